@@ -1,0 +1,6 @@
+# What our own code is held to; linked privately, so that it reaches nobody who uses the libraries.
+add_library(cimdelta_warnings INTERFACE)
+target_compile_options(cimdelta_warnings INTERFACE -Wall -Wextra -Wpedantic -Wshadow -Wconversion -Wnon-virtual-dtor)
+if(CIMDELTA_WARNINGS_AS_ERRORS)
+  target_compile_options(cimdelta_warnings INTERFACE -Werror)
+endif()

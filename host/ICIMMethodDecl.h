@@ -1,0 +1,18 @@
+#pragma once
+
+#include <string>
+
+#include "host/ICIMNamedElement.h"
+
+namespace NORVZEL20 {
+
+/// The declaration of a method in a class.
+class ICIMMethodDecl : public ICIMNamedElement {
+  public:
+    /// The name as declared; valid while the declaration lives.
+    virtual const std::string& GetName(TCallContext context) const = 0;
+    /// The type of the result; kNone for none.
+    virtual TCIMValue::TCIMType GetType(TCallContext context) const = 0;
+};
+
+}  // namespace NORVZEL20

@@ -1,0 +1,16 @@
+#pragma once
+
+#include <string>
+
+namespace NORVZEL20 {
+
+/// The host's log.
+class ILogger {
+  public:
+    virtual ~ILogger() = default;
+
+    /// Writes one entry. Level 0 is an error; the higher the level, the less urgent. The message may end with a line end.
+    virtual void Log(int level, const std::string& message) = 0;
+};
+
+}  // namespace NORVZEL20

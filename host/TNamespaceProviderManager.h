@@ -1,0 +1,34 @@
+#pragma once
+
+#include <mutex>
+#include <string>
+#include <vector>
+
+#include "host/INamespaceProviderManager.h"
+
+namespace NORVZEL20 {
+
+/// The host's registry of namespace providers, one in a process. "inmem" is there from the start.
+///
+/// The order of the virtual operations is part of the contract: registration, then look-up.
+/// Threads: any, at any time.
+class TNamespaceProviderManager : public INamespaceProviderManager {
+  public:
+    static boost::shared_ptr<TNamespaceProviderManager> GetInstance();
+
+    TZELStatusCode RegisterProvider(boost::shared_ptr<INamespaceProvider> provider) override;
+
+    /// The provider registered under `name`, byte for byte, or null.
+    virtual boost::shared_ptr<INamespaceProvider> FindProvider(const std::string& name);
+
+    /// The names of all providers, in order of registration.
+    std::vector<std::string> GetProviderNames() const;
+
+  private:
+    TNamespaceProviderManager() = default;
+
+    mutable std::mutex fMutex;
+    std::vector<boost::shared_ptr<INamespaceProvider>> fProviders;
+};
+
+}  // namespace NORVZEL20

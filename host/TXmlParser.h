@@ -1,0 +1,56 @@
+#pragma once
+
+#include <cstddef>
+#include <map>
+#include <memory>
+#include <string>
+
+namespace NORVZEL20 {
+
+class TXmlReader;
+
+/// An event-driven XML 1.0 parser: derive from it and override what is of interest. The order of the virtual operations is part of
+/// the contract.
+///
+/// External entities are never opened; the expansion of entities, the depth of elements and the length of one text are bounded. A
+/// document may be in UTF-8, UTF-16, ISO-8859-1 or US-ASCII; events carry UTF-8.
+/// An exception thrown by a handler ends the parse and leaves Parse as it was thrown.
+/// Threads: one at a time for each parser.
+class TXmlParser {
+  public:
+    TXmlParser();
+    TXmlParser(const TXmlParser&) = delete;
+    TXmlParser& operator=(const TXmlParser&) = delete;
+    virtual ~TXmlParser();
+
+    /// Called for a start tag; the map is the handler's to change.
+    virtual void StartElement(const char* name, std::map<std::string, std::string>& attrs);
+    virtual void EndElement(const char* name);
+    virtual void processingInstruction(const char* target, const char* data);
+    /// Called with the whole character data between two tags, entities replaced, comments left out; `text` ends with a NUL that
+    /// `length` does not count. Not called where there is none.
+    virtual void characters(const char* text, unsigned int length);
+    virtual void notationDecl(const char* name, const char* publicId, const char* systemId);
+    /// Called once for a document that is not well-formed or exceeds a bound, with the reason. The parse ends when it returns.
+    virtual void FatalError(const char* message);
+    /// A hook for server-page sections; this parser knows none and never calls it.
+    virtual void ParseJSSP();
+    /// Called before each tag: hands the text collected since the last one to `characters`.
+    virtual void ParseCharData();
+
+    /// Parses `text` up to its terminating NUL.
+    void Parse(char* text);
+    /// Parses exactly `length` bytes; a NUL among them is an error of the document.
+    void Parse(char* text, std::size_t length);
+
+    /// The line of the event in progress, counted from 1.
+    unsigned int GetCurLine() const;
+    /// The column of the event in progress, counted in bytes from 1.
+    unsigned int GetCurColumn() const;
+
+  private:
+    friend class TXmlReader;
+    std::unique_ptr<TXmlReader> fReader;
+};
+
+}  // namespace NORVZEL20
