@@ -1,0 +1,54 @@
+#pragma once
+
+#include <boost/function.hpp>
+#include <boost/smart_ptr/shared_ptr.hpp>
+#include <cstddef>
+#include <string>
+#include <vector>
+
+#include "embedded/TLoadReport.h"
+#include "embedded/TPopulateError.h"
+#include "host/ICIMElement.h"
+#include "host/ICIMNamespace.h"
+
+namespace NORVZEL20 {
+
+/// Loads CIM-XML documents (DSP0201) into a namespace: declarations in any kind of group, and recorded requests and responses.
+///
+/// Classes may come in any order, and instances before their class. A property that an instance does not mention is null there. A
+/// reference without a namespace, or to the document's own namespace (and host), is stored without one.
+/// Each load is all or nothing: where it throws, the namespace is as it was.
+/// Errors of every load: TPopulateError with the statuses of TNamespacePopulator::PopulateFromXMLFile, 31 where the namespace is
+/// none of the provider "inmem"; std::bad_alloc. Nothing is logged. Threads: one at a time for each populator and namespace;
+/// several populators may work at once on namespaces of their own. Cost: one pass over the document; a document is never held
+/// whole, except the file of LoadFile where it is a regular one.
+class TCimXmlPopulator {
+  public:
+    /// Fills the buffer with at most so many bytes and returns how many; 0 ends the document. May throw: the load then fails with
+    /// that exception.
+    using TPullSource = boost::function<std::size_t(char*, std::size_t)>;
+
+    explicit TCimXmlPopulator(boost::shared_ptr<ICIMNamespace> ns);
+
+    /// Loads the `length` bytes at `data`, which are called `name` in messages.
+    TLoadReport LoadFromMemory(const char* data, std::size_t length, const std::string& name);
+
+    /// Loads what `source` delivers.
+    TLoadReport LoadFromSource(const TPullSource& source, const std::string& name);
+
+    /// Loads the file at `path`. Errors: also status 11 where it cannot be opened or read.
+    TLoadReport LoadFile(const std::string& path);
+
+    /// From now on keeps what is loaded; for TakeElements.
+    void KeepElements() { fKeep = true; }
+
+    /// The classes, then the instances loaded since the last call, each in the document's order. Empty without KeepElements.
+    std::vector<boost::shared_ptr<ICIMElement>> TakeElements();
+
+  private:
+    boost::shared_ptr<ICIMNamespace> fNamespace;
+    bool fKeep = false;
+    std::vector<boost::shared_ptr<ICIMElement>> fElements;
+};
+
+}  // namespace NORVZEL20

@@ -1,0 +1,52 @@
+#pragma once
+
+#include <boost/function.hpp>
+#include <boost/smart_ptr/shared_ptr.hpp>
+#include <string>
+#include <string_view>
+
+#include "host/ICIMClass.h"
+#include "host/ICIMInstance.h"
+#include "host/ICIMNamespace.h"
+
+namespace NORVZEL20 {
+
+/// Writes a namespace as CIM-XML (DSP0201), so that loading the document gives an equal namespace.
+///
+/// Text reaches the sink in pieces of some 64 KiB, in UTF-8; nothing is held beyond that. Characters that XML readers would change
+/// (carriage return, tab, line feed) are written as character references. Output depends on the namespace's contents alone.
+/// A control character that XML 1.0 cannot carry is written as U+FFFD.
+/// Errors: what the sink or the namespace throws.
+class TCimXmlWriter {
+  public:
+    using TSink = boost::function<void(std::string_view)>;
+
+    explicit TCimXmlWriter(TSink sink);
+    TCimXmlWriter(const TCimXmlWriter&) = delete;
+    TCimXmlWriter& operator=(const TCimXmlWriter&) = delete;
+
+    /// The whole document: CIM, DECLARATION and DECLGROUP with qualifier declarations, classes (superclasses first) and instances
+    /// (class by class in that order, each in order of insertion). `namespaceName` is named in the group where it is not empty.
+    void WriteNamespace(ICIMNamespace& ns, const std::string& namespaceName = std::string());
+
+    /// The parts, for documents put together by the caller: StartDocument, any number of the others, EndDocument.
+    void StartDocument(const std::string& namespaceName = std::string());
+    void WriteQualifierDecl(const ICIMQualifierDecl& decl);
+    /// One VALUE.OBJECT with the CLASS: its own qualifiers, and the properties and methods that it declares itself.
+    void WriteClass(const ICIMClass& cls);
+    /// One VALUE.OBJECT with the INSTANCE; null properties are written without a value.
+    void WriteInstance(const ICIMInstance& instance);
+    void EndDocument();
+
+    /// The element INSTANCE alone, in one line.
+    static std::string InstanceToXml(const ICIMInstance& instance);
+
+  private:
+    void Flush();
+    void FlushWhenFull();
+
+    TSink fSink;
+    std::string fBuffer;
+};
+
+}  // namespace NORVZEL20

@@ -1,0 +1,92 @@
+#pragma once
+
+#include <cstddef>
+#include <exception>
+#include <memory>
+#include <string>
+#include <string_view>
+
+namespace NORVZEL20 {
+
+/// Reads XML 1.0 over Expat: the one place that calls the C library.
+///
+/// Events go to a sink, with text whole between two tags. A NUL behind the text is there but not counted. An exception of the sink
+/// never crosses the C library: the parse is stopped, and Parse or Finish throws it as it was.
+/// External entities are never opened: a reference to one is an error. The expansion of entities, the depth of elements, the
+/// number of attributes of an element and the length of a text and of a tag are bounded; exceeding a bound is an error.
+/// Threads: one at a time for each reader.
+class TXmlReader {
+  public:
+    static constexpr std::size_t kMaxDepth = 10000;               ///< elements that are open at a time
+    static constexpr std::size_t kMaxAttributes = 1000;           ///< attributes of one element
+    static constexpr std::size_t kMaxTextLength = 128u << 20;     ///< bytes of text between two tags
+    static constexpr std::size_t kMaxTokenLength = 16u << 20;     ///< bytes of one tag, comment or the like
+    static constexpr std::size_t kExpansionThreshold = 4u << 20;  ///< bytes from which on the amplification is watched
+    static constexpr float kMaxAmplification = 20.0F;             ///< output over input of entity expansion
+
+    /// Takes the events. Pointers are valid during the call alone.
+    class ISink {
+      public:
+        virtual ~ISink() = default;
+        /// `attributes` alternates names and values and ends with null.
+        virtual void OnStart(const char* name, const char** attributes) = 0;
+        virtual void OnEnd(const char* name) = 0;
+        /// Called before each tag with what stands between it and the tag before, where that is not empty.
+        virtual void OnText(const char* text, std::size_t length) = 0;
+        virtual void OnProcessingInstruction(const char*, const char*) {}
+        virtual void OnNotation(const char*, const char*, const char*) {}
+    };
+
+    /// The sink must outlive the reader. Errors: std::bad_alloc.
+    explicit TXmlReader(ISink& sink);
+    TXmlReader(const TXmlReader&) = delete;
+    TXmlReader& operator=(const TXmlReader&) = delete;
+    ~TXmlReader();
+
+    /// Makes the reader ready for a new document.
+    void Reset();
+
+    /// Parses the next `length` bytes. Returns false where the document is in error; see GetError. Errors: what the sink throws.
+    bool Parse(const char* data, std::size_t length);
+    /// Ends the document. Returns false where it is in error, for instance not complete.
+    bool Finish();
+
+    /// Room for at least `length` more bytes, to be filled and handed over by ParseBuffer; valid until then.
+    char* GetBuffer(std::size_t length);
+    /// As Parse, with the first `length` bytes of the room that GetBuffer gave.
+    bool ParseBuffer(std::size_t length);
+    /// How many of the bytes handed over belong to a tag that has not ended yet.
+    std::size_t GetPending() const;
+
+    /// Stops the parse from within an event; Parse then returns true and ignores the rest.
+    void Stop();
+
+    /// The reason of the failure; empty where there was none.
+    const std::string& GetError() const noexcept { return fError; }
+
+    /// The line and column (in bytes) of the event or error, counted from 1. Cost: in proportion to the bytes since the last call.
+    std::size_t GetLine() const;
+    std::size_t GetColumn() const;
+
+  private:
+    struct TCallbacks;
+    struct TParserFree {
+        void operator()(void* parser) const noexcept;
+    };
+
+    void Install();
+    bool Settle(int status);
+    void Refuse(std::string reason);
+    void HandOverText();
+
+    ISink& fSink;
+    std::unique_ptr<void, TParserFree> fParser;
+    std::string fText;
+    std::size_t fDepth = 0;
+    std::size_t fBytes = 0;
+    std::string fError;
+    std::exception_ptr fException;
+    bool fStopped = false;
+};
+
+}  // namespace NORVZEL20
