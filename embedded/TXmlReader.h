@@ -4,7 +4,8 @@
 #include <exception>
 #include <memory>
 #include <string>
-#include <string_view>
+
+struct XML_ParserStruct;
 
 namespace NORVZEL20 {
 
@@ -21,6 +22,7 @@ class TXmlReader {
     static constexpr std::size_t kMaxAttributes = 1000;           ///< attributes of one element
     static constexpr std::size_t kMaxTextLength = 128u << 20;     ///< bytes of text between two tags
     static constexpr std::size_t kMaxTokenLength = 16u << 20;     ///< bytes of one tag, comment or the like
+    static constexpr std::size_t kMaxEntities = 1000;             ///< entities that a document declares
     static constexpr std::size_t kExpansionThreshold = 4u << 20;  ///< bytes from which on the amplification is watched
     static constexpr float kMaxAmplification = 20.0F;             ///< output over input of entity expansion
 
@@ -31,7 +33,8 @@ class TXmlReader {
         /// `attributes` alternates names and values and ends with null.
         virtual void OnStart(const char* name, const char** attributes) = 0;
         virtual void OnEnd(const char* name) = 0;
-        /// Called before each tag with what stands between it and the tag before, where that is not empty.
+        /// Called before each tag with what stands between it and the tag before, where that is not empty. The text stays valid
+        /// until the tag's own event returns.
         virtual void OnText(const char* text, std::size_t length) = 0;
         virtual void OnProcessingInstruction(const char*, const char*) {}
         virtual void OnNotation(const char*, const char*, const char*) {}
@@ -46,8 +49,9 @@ class TXmlReader {
     /// Makes the reader ready for a new document.
     void Reset();
 
-    /// Parses the next `length` bytes. Returns false where the document is in error; see GetError. Errors: what the sink throws.
-    bool Parse(const char* data, std::size_t length);
+    /// Parses the next `length` bytes; `last` ends the document too, at less cost than a call of Finish. Returns false where the
+    /// document is in error; see GetError. Errors: what the sink throws.
+    bool Parse(const char* data, std::size_t length, bool last = false);
     /// Ends the document. Returns false where it is in error, for instance not complete.
     bool Finish();
 
@@ -70,19 +74,20 @@ class TXmlReader {
 
   private:
     struct TCallbacks;
-    struct TParserFree {
-        void operator()(void* parser) const noexcept;
+    struct TFree {
+        void operator()(XML_ParserStruct* parser) const noexcept;
     };
 
     void Install();
-    bool Settle(int status);
-    void Refuse(std::string reason);
+    bool Settle(bool succeeded);
+    void Refuse(const char* reason);
     void HandOverText();
 
     ISink& fSink;
-    std::unique_ptr<void, TParserFree> fParser;
+    std::unique_ptr<XML_ParserStruct, TFree> fParser;
     std::string fText;
     std::size_t fDepth = 0;
+    std::size_t fEntities = 0;
     std::size_t fBytes = 0;
     std::string fError;
     std::exception_ptr fException;

@@ -7,8 +7,6 @@
 
 namespace NORVZEL20 {
 
-class TXmlReader;
-
 /// An event-driven XML 1.0 parser: derive from it and override what is of interest. The order of the virtual operations is part of
 /// the contract.
 ///
@@ -49,8 +47,8 @@ class TXmlParser {
     unsigned int GetCurColumn() const;
 
   private:
-    friend class TXmlReader;
-    std::unique_ptr<TXmlReader> fReader;
+    class TEvents;
+    std::unique_ptr<TEvents> fEvents;
 };
 
 }  // namespace NORVZEL20
