@@ -1,0 +1,32 @@
+#pragma once
+
+#include "engine/TCIMDiffEngine.h"
+#include "host/TUnaryFunction.h"
+
+namespace NORVZEL20 {
+
+/// Takes the instances of one class of one namespace, and compares each with the reference's instance of the same key.
+///
+/// Everything but the rules is the caller's and must outlive the enumeration.
+class TCIMDiffEngine::TCompareInstances : public TUnaryFunction<boost::shared_ptr<ICIMInstance>> {
+  public:
+    TCompareInstances(TCIMDiffEngine* engine, boost::shared_ptr<TDiffClassRules> rules,
+                      std::map<std::string, TMasterInstance>* masterMap, std::map<std::string, std::vector<int>>* missingMap,
+                      std::map<std::string, std::map<std::string, std::vector<int>>>* differenceMap, unsigned int namespaceIndex,
+                      std::vector<std::string>* propertyList);
+    TCompareInstances(const TCompareInstances& other) = default;
+
+    /// Marks the reference's instance as found and compares with it, or enters the key as missing from the reference. Always true.
+    bool operator()(boost::shared_ptr<ICIMInstance> instance);
+
+  private:
+    TCIMDiffEngine* fEngine;
+    boost::shared_ptr<TDiffClassRules> fRules;
+    std::map<std::string, TMasterInstance>* fMasterMap;
+    std::map<std::string, std::vector<int>>* fMissingMap;
+    std::map<std::string, std::map<std::string, std::vector<int>>>* fDifferenceMap;
+    unsigned int fNamespaceIndex;
+    std::vector<std::string>* fPropertyList;
+};
+
+}  // namespace NORVZEL20

@@ -1,0 +1,13 @@
+#pragma once
+
+#include "spec/TParseState.h"
+
+namespace NORVZEL20 {
+
+/// In "excludelist": accepts "value", whose property is to be ignored.
+class TCIMDiffEngine::TDiffXMLParser::TStateExcludeList : public TCIMDiffEngine::TDiffXMLParser::TParseState {
+  public:
+    void StartElement(TDiffXMLParser& parser, std::string& name, std::map<std::string, std::string>& attrs) override;
+};
+
+}  // namespace NORVZEL20
