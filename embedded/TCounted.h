@@ -1,0 +1,29 @@
+#pragma once
+
+#include <atomic>
+#include <cstdint>
+
+namespace NORVZEL20 {
+
+/// The reference count that every shared block begins with. It starts at one: the maker's own use.
+///
+/// Not polymorphic: whoever releases the last use knows the block's type and destroys it.
+/// Threads: any, at any time.
+class TCounted {
+  public:
+    TCounted() noexcept = default;
+    TCounted(const TCounted&) = delete;
+    TCounted& operator=(const TCounted&) = delete;
+
+    void Acquire() const noexcept { fUses.fetch_add(1, std::memory_order_relaxed); }
+
+    /// True where that was the last use; the caller then destroys the block.
+    bool Release() const noexcept { return fUses.fetch_sub(1, std::memory_order_acq_rel) == 1; }
+
+    bool IsUnique() const noexcept { return fUses.load(std::memory_order_acquire) == 1; }
+
+  private:
+    mutable std::atomic<std::uint32_t> fUses{1};
+};
+
+}  // namespace NORVZEL20

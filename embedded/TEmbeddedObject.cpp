@@ -1,0 +1,1 @@
+#include "embedded/TEmbeddedObject.h"

@@ -1,0 +1,46 @@
+#pragma once
+
+#include <cstddef>
+#include <cstdint>
+#include <map>
+#include <string>
+#include <string_view>
+#include <unordered_map>
+
+namespace NORVZEL20 {
+
+/// Names of classes, properties, qualifiers and namespaces: letter case does not count (ASCII letters alone), no locale involved.
+class TNameText {
+  public:
+    TNameText() = delete;
+
+    static constexpr char ToLower(char c) noexcept { return c >= 'A' && c <= 'Z' ? char(c + ('a' - 'A')) : c; }
+    static std::string ToLower(std::string_view name);
+    static bool Equal(std::string_view a, std::string_view b) noexcept;
+    /// Negative, zero or positive, as the lower-case forms compare byte for byte.
+    static int Compare(std::string_view a, std::string_view b) noexcept;
+    /// The same for names that are Equal; all 32 bits are of use.
+    static std::uint32_t Hash(std::string_view name) noexcept;
+
+    /// Functors for containers; TLess takes std::string_view for look-up too.
+    struct TLess {
+        using is_transparent = void;
+        bool operator()(std::string_view a, std::string_view b) const noexcept { return Compare(a, b) < 0; }
+    };
+    struct TEqual {
+        bool operator()(std::string_view a, std::string_view b) const noexcept { return Equal(a, b); }
+    };
+    struct THash {
+        std::size_t operator()(std::string_view name) const noexcept { return Hash(name); }
+    };
+};
+
+/// Keyed by name and ordered by it; `find` takes any text without making a std::string.
+template <class T>
+using TNameMap = std::map<std::string, T, TNameText::TLess>;
+
+/// Keyed by a name that somebody else keeps (the value of the entry, say) and that must outlive the entry.
+template <class T>
+using TNameHashMap = std::unordered_map<std::string_view, T, TNameText::THash, TNameText::TEqual>;
+
+}  // namespace NORVZEL20

@@ -1,0 +1,28 @@
+#pragma once
+
+#include <memory>
+
+#include "host/ILogger.h"
+
+namespace spdlog {
+class logger;
+}
+
+namespace NORVZEL20 {
+
+/// The log on standard error: a line for each entry, with time, severity and process; one line end at an entry's end is left out.
+/// Level 0 is an error, 1 a warning, 2 information, 3 and more detail; detail is not shown. Never throws.
+///
+/// Threads: any, at any time.
+class TSpdLogger : public ILogger {
+  public:
+    TSpdLogger();
+    ~TSpdLogger() override;
+
+    void Log(int level, const std::string& message) override;
+
+  private:
+    std::shared_ptr<spdlog::logger> fLogger;
+};
+
+}  // namespace NORVZEL20

@@ -1,0 +1,1 @@
+#include "embedded/TValueText.h"

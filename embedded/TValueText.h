@@ -1,0 +1,47 @@
+#pragma once
+
+#include <string>
+#include <string_view>
+
+#include "host/TCIMValue.h"
+
+namespace NORVZEL20 {
+
+/// The text forms of values, without any locale.
+class TValueText {
+  public:
+    TValueText() = delete;
+
+    /// Reads `text` as a value of the non-array type `type`, as CIM-XML writes them (DSP0201, 5.2.4 "VALUE").
+    ///
+    /// Booleans TRUE and FALSE in any letter case; integers in decimal, 0x hexadecimal or with a B behind in binary, signed ones
+    /// with an optional sign, within the type's range; reals in decimal with optional exponent, INF, -INF, NaN in any letter case,
+    /// rounded to the type; char16 exactly one UCS-2 unit in UTF-8; datetimes of 25 characters; strings as they are. White space
+    /// around is left out for all but strings and char16. Returns false, and leaves `result` as it is, for everything else,
+    /// references and arrays included.
+    static bool Parse(TCIMValue::TCIMType type, std::string_view text, TCIMValue& result);
+
+    /// Gives `value` the type `type` where that loses nothing: itself where it has the type already, nulls, integers to integers
+    /// within range and to reals that hold them exactly, reals to reals likewise, text to whatever Parse reads from it and to
+    /// references, datetimes and references to text, arrays element by element. Returns false, and leaves `result` as it is,
+    /// otherwise. The path text of an undeclared class and a text that is not one differ here: only the former converts.
+    static bool Convert(const TCIMValue& value, TCIMValue::TCIMType type, TCIMValue& result);
+
+    /// The name of a type in CIM-XML: "uint16" for the type and for arrays of it, "reference", "" for none.
+    static const char* GetTypeName(TCIMValue::TCIMType type) noexcept;
+    /// The element type of that name in lower case ("reference" included); kNone where there is none.
+    static TCIMValue::TCIMType FindType(std::string_view name) noexcept;
+
+    /// Appends a non-null boolean, number, char16, text or datetime as it is, unquoted and unescaped.
+    static void AppendPlain(std::string& out, const TCIMValue& value);
+    /// Appends `text` between two `quote` characters, with `quote` and `\` escaped by `\`.
+    static void AppendQuoted(std::string& out, std::string_view text, char quote);
+    static void AppendUnsigned(std::string& out, std::uint64_t number);
+    static void AppendSigned(std::string& out, std::int64_t number);
+    /// The shortest text that reads back as the same double (for real32: as the same float); INF, -INF, NaN.
+    static void AppendReal(std::string& out, double number, bool isReal32);
+    /// UTF-8 of one UCS-2 unit, surrogates encoded as they are.
+    static void AppendChar16(std::string& out, char16_t unit);
+};
+
+}  // namespace NORVZEL20

@@ -1,0 +1,50 @@
+#include "host/TZELStatusCode.h"
+
+namespace NORVZEL20 {
+
+namespace {
+
+struct TStatusText {
+    int fStatus;
+    std::string fText;
+};
+
+// Never destroyed: an exception may still be asked for its text while the process ends.
+const TStatusText* GetTexts()
+{
+    static const auto* const fgTexts = new TStatusText[]{
+        {TZELStatusCode::kSuccess, "Success"},
+        {TZELStatusCode::kNotOffered, "Not offered"},
+        {TZELStatusCode::kInitializationFailed, "Initialization failed"},
+        {TZELStatusCode::kOutOfMemory, "Out of memory"},
+        {TZELStatusCode::kInvalidParameter, "Invalid parameter"},
+        {TZELStatusCode::kParseError, "Parse error"},
+        {TZELStatusCode::kFileError, "File error"},
+        {TZELStatusCode::kAlreadyExists, "Already exists"},
+        {TZELStatusCode::kTypeMismatch, "Type mismatch"},
+        {TZELStatusCode::kKeyMissing, "Key without a value"},
+        {TZELStatusCode::kNotFound, "Not found"},
+        {TZELStatusCode::kInvalidQuery, "Invalid query"},
+        {TZELStatusCode::kQueryLanguageUnknown, "Unknown query language"},
+        {TZELStatusCode::kNamespaceGone, "Namespace is gone"},
+        {TZELStatusCode::kClassInUse, "Class in use"},
+        {TZELStatusCode::kNotSupported, "Not supported"},
+        {TZELStatusCode::kSchemaMismatch, "Schema mismatch"},
+        {TZELStatusCode::kMissingParameter, "Missing parameter"},
+        {-1, "Unknown status"},
+    };
+    return fgTexts;
+}
+
+}  // namespace
+
+const std::string& TZELStatusCode::TranslateStatusCode() const
+{
+    const TStatusText* entry = GetTexts();
+    while (entry->fStatus != -1 && entry->fStatus != int(fStatus)) {
+        ++entry;
+    }
+    return entry->fText;
+}
+
+}  // namespace NORVZEL20
