@@ -1,0 +1,54 @@
+#pragma once
+
+#include <cstddef>
+#include <cstdint>
+#include <utility>
+#include <vector>
+
+namespace NORVZEL20 {
+
+/// Finds the ordinal of an element that somebody else keeps by the hash of its key: open addressing, eight bytes an entry.
+///
+/// The index sees no keys: the caller tells for each ordinal of the right hash whether it is the one. All operations take constant
+/// time on average; Add and Reserve may throw std::bad_alloc and then change nothing.
+class THashIndex {
+  public:
+    static constexpr std::uint32_t kNone = 0xffffffff;
+
+    /// The first ordinal under `hash` for which `matches(ordinal)` is true, or kNone.
+    template <class TMatch>
+    std::uint32_t Find(std::uint32_t hash, TMatch&& matches) const
+    {
+        if (fEntries.empty())
+            return kNone;
+        for (std::size_t at = Home(hash); fEntries[at].ordinal != kNone; at = Next(at)) {
+            if (fEntries[at].hash == hash && matches(fEntries[at].ordinal))
+                return fEntries[at].ordinal;
+        }
+        return kNone;
+    }
+
+    /// `ordinal` must not be kNone, and not be there under `hash`.
+    void Add(std::uint32_t hash, std::uint32_t ordinal);
+    /// Does nothing where the pair is not there.
+    void Remove(std::uint32_t hash, std::uint32_t ordinal) noexcept;
+    /// Makes room, so that `count` entries in all can be added without a failure.
+    void Reserve(std::size_t count);
+    void Clear() noexcept;
+    void Swap(THashIndex& other) noexcept;
+
+  private:
+    struct TEntry {
+        std::uint32_t hash;
+        std::uint32_t ordinal;  ///< kNone: the place is free
+    };
+
+    std::size_t Home(std::uint32_t hash) const noexcept { return (hash * 0x9e3779b1U >> 7) & (fEntries.size() - 1); }
+    std::size_t Next(std::size_t at) const noexcept { return (at + 1) & (fEntries.size() - 1); }
+    static void Place(std::vector<TEntry>& entries, std::size_t at, TEntry entry) noexcept;
+
+    std::vector<TEntry> fEntries;  // a power of two, at most three quarters in use
+    std::size_t fCount = 0;
+};
+
+}  // namespace NORVZEL20

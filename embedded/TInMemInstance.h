@@ -1,0 +1,87 @@
+#pragma once
+
+#include <boost/smart_ptr/enable_shared_from_this.hpp>
+#include <cstddef>
+#include <cstdint>
+#include <memory>
+#include <string>
+#include <string_view>
+#include <vector>
+
+#include "embedded/TInMemProperty.h"
+#include "host/ICIMInstance.h"
+
+namespace NORVZEL20 {
+
+class TInMemClass;
+
+/// An instance in memory: one block with the shared pointer's counts, the instance and all its properties.
+///
+/// Made by TInMemClass::AllocateInMemInstance. A property that the class gets later is made when it is first asked for. Handles
+/// stay valid when the instance is deleted and when the namespace goes; AddToNamespace then throws status 18.
+class TInMemInstance final : public ICIMInstance, public boost::enable_shared_from_this<TInMemInstance> {
+  public:
+    /// For TInMemClass alone: `room` is uninitialised memory of BlockSize(slots) bytes that outlives the instance.
+    TInMemInstance(boost::shared_ptr<TInMemClass> cls, void* room, std::uint32_t slots) noexcept;
+    TInMemInstance(const TInMemInstance&) = delete;
+    TInMemInstance& operator=(const TInMemInstance&) = delete;
+    ~TInMemInstance() override;
+
+    /// Returns where AddToNamespace would succeed. Errors: those of AddToNamespace.
+    void Validate(TCallContext context) const override;
+    /// Generated keys that are null get the next number of the class first. Errors: also status 5 where it is in a namespace.
+    void AddToNamespace(TCallContext context) override;
+    TCIMReference GetReference(TCallContext context) const override;
+    boost::shared_ptr<ICIMClass> GetClass(TCallContext context) const override;
+    boost::shared_ptr<ICIMProperty> GetProperty(const std::string& name, TCallContext context) const override;
+    void EnumerateProperties(const boost::function<bool(boost::shared_ptr<ICIMProperty>)>& callback,
+                             TCallContext context) const override;
+
+    /// As the operations above, without context.
+    TCIMReference GetReference() const;
+    const boost::shared_ptr<TInMemClass>& GetInMemClass() const noexcept { return fClass; }
+    /// The instance's own property of that name; null where the class declares none, and for a static one. Valid while the
+    /// instance lives.
+    TInMemProperty* FindProperty(std::string_view name) const;
+    /// The property in a slot of the class (see TInMemClass::FindSlot).
+    TInMemProperty& GetSlotProperty(std::uint32_t slot) const;
+    /// The value in a slot; a static property's too.
+    const TCIMValue& GetSlotValue(std::uint32_t slot) const;
+    /// Sets the property in a slot as ICIMProperty::SetValue does, without looking up a name. Errors: status 13.
+    void SetSlot(std::uint32_t slot, TCIMValue value);
+
+    /// Whether it is part of the namespace.
+    bool IsAdded() const noexcept { return fAdded; }
+    /// The name of the first key without a value, which keeps the instance from being added; null where there is none.
+    const std::string* FindMissingKey() const;
+
+    static std::size_t BlockSize(std::uint32_t slots) noexcept;
+
+  private:
+    friend class TInMemProperty;
+    friend class TInMemExtent;
+
+    struct TBlock;   // the head of a block of properties: which instance, which slots
+    struct TExtras;  // what few instances have: later properties, earlier values, keys as added
+    struct TBlockDeleter {
+        void operator()(TBlock* block) const noexcept;
+    };
+
+    static TBlock* MakeBlock(void* room, TInMemInstance& owner, const TInMemClass& cls, std::uint32_t first,
+                             std::uint32_t count) noexcept;
+    TExtras& GetExtras() const;
+    TInMemProperty& GetLateProperty(std::uint32_t slot) const;
+    void Change(TInMemProperty& property, TCIMValue value);
+    void RememberKey(const TInMemProperty& property);
+    void RememberEarlier(const TInMemProperty& property);
+    const TCIMValue* FindEarlier(std::uint32_t slot) const noexcept;
+    /// The value of a key as it was when the instance was added.
+    const TCIMValue& GetAddedKey(std::uint32_t slot) const;
+
+    boost::shared_ptr<TInMemClass> fClass;
+    TBlock* fBlock;
+    mutable std::unique_ptr<TExtras> fExtras;
+    bool fAdded = false;
+};
+
+}  // namespace NORVZEL20

@@ -1,0 +1,47 @@
+#pragma once
+
+#include <cstdint>
+
+#include "host/ICIMProperty.h"
+
+namespace NORVZEL20 {
+
+class TInMemInstance;
+
+/// One property of an in-memory instance; 32 bytes inside the instance's own block.
+///
+/// Handles are shared pointers into the instance, which they keep alive.
+class TInMemProperty final : public ICIMProperty {
+  public:
+    TInMemProperty(std::uint32_t slot, std::uint32_t position, const TCIMValue& value) noexcept;
+    TInMemProperty(const TInMemProperty&) = delete;
+    TInMemProperty& operator=(const TInMemProperty&) = delete;
+
+    const TCIMValue& GetValue(TCallContext context) const override;
+    void SetValue(const TCIMValue& value, TCallContext context) override;
+    void MarkRemoved() override;
+    void MarkChanged(const TCIMValue& value) override;
+    boost::shared_ptr<const ICIMPropertyDecl> GetPropertyDecl(TCallContext context) const override;
+
+    const TCIMValue& GetValue() const noexcept { return fValue; }
+    bool IsChanged() const noexcept { return fChanged; }
+    bool IsRemoved() const noexcept { return fRemoved; }
+    /// What the property held before the first MarkChanged; null where there was none. Valid until another property of the
+    /// instance is changed.
+    const TCIMValue* GetEarlierValue() const noexcept;
+
+  private:
+    friend class TInMemInstance;
+
+    TInMemInstance& GetInstance() const noexcept;
+
+    TCIMValue fValue;
+    std::uint32_t fSlot;           // in the layout of the class
+    std::uint32_t fPosition : 30;  // in its block of properties, by which the instance is found
+    std::uint32_t fChanged : 1;
+    std::uint32_t fRemoved : 1;
+};
+
+static_assert(sizeof(TInMemProperty) == 32, "a property takes half a cache line");
+
+}  // namespace NORVZEL20

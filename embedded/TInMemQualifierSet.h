@@ -1,0 +1,42 @@
+#pragma once
+
+#include <boost/function.hpp>
+#include <boost/smart_ptr/shared_ptr.hpp>
+#include <string_view>
+#include <vector>
+
+#include "host/ICIMQualifier.h"
+
+namespace NORVZEL20 {
+
+/// The qualifiers of one element: its own, and those that it inherits from the element it stems from.
+///
+/// A qualifier is inherited where its flavor says so (to the subclass) and the element has none of that name itself.
+class TInMemQualifierSet {
+  public:
+    /// Names the set to inherit from; null for none. It must outlive this one.
+    void SetParent(const TInMemQualifierSet* parent) noexcept { fParent = parent; }
+
+    /// Adds one, or puts it in the place of an own one of that name. `qualifier` must not be null.
+    void Add(boost::shared_ptr<ICIMQualifier> qualifier);
+
+    /// The qualifier of that name, own or inherited, or null. Letter case does not count.
+    boost::shared_ptr<ICIMQualifier> Find(std::string_view name) const;
+    /// Own ones in the order they were added, then inherited ones, until the callback returns false.
+    void Enumerate(const boost::function<bool(boost::shared_ptr<ICIMQualifier>)>& callback) const;
+
+    /// The element's own ones, in the order they were added.
+    const std::vector<boost::shared_ptr<ICIMQualifier>>& GetOwn() const noexcept { return fOwn; }
+    /// Whether there is one of that name, own or inherited, with the value TRUE.
+    bool IsTrue(std::string_view name) const;
+    /// Whether the element or any that it stems from has one of that name with the value TRUE, whatever its flavor.
+    bool IsTrueAnywhere(std::string_view name) const;
+
+  private:
+    boost::shared_ptr<ICIMQualifier> FindOwn(std::string_view name) const;
+
+    std::vector<boost::shared_ptr<ICIMQualifier>> fOwn;
+    const TInMemQualifierSet* fParent = nullptr;
+};
+
+}  // namespace NORVZEL20

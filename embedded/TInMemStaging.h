@@ -1,0 +1,45 @@
+#pragma once
+
+#include <boost/smart_ptr/shared_ptr.hpp>
+#include <utility>
+#include <vector>
+
+#include "embedded/TInMemNamespace.h"
+
+namespace NORVZEL20 {
+
+/// Adds many things to a namespace, all of them or none.
+///
+/// What is added shows at once. Unless Commit is called, the destructor takes everything out again, and the namespace is as it was,
+/// generated numbers included; classes that were there must not be changed, and nothing removed, while a staging is open.
+/// Threads: as the namespace.
+class TInMemStaging {
+  public:
+    /// `ns` must not be null.
+    explicit TInMemStaging(boost::shared_ptr<TInMemNamespace> ns) noexcept;
+    TInMemStaging(const TInMemStaging&) = delete;
+    TInMemStaging& operator=(const TInMemStaging&) = delete;
+    ~TInMemStaging();
+
+    /// Errors: status 12 where one of that name is declared. After an error of these three the staging may go on.
+    void AddQualifierDecl(const boost::shared_ptr<TInMemQualifierDecl>& decl);
+    /// A class allocated from the namespace, its superclass declared. Errors: status 12, 15.
+    void AddClass(const boost::shared_ptr<TInMemClass>& cls);
+    /// Errors: status 12 where one with the same keys is there (GetReference then tells its path), 14 where a key is null
+    /// (FindMissingKey then tells its name), 15 where the class is not declared.
+    void AddInstance(const boost::shared_ptr<TInMemInstance>& instance);
+
+    void Commit() noexcept;
+
+  private:
+    TInMemExtent& Touch(TInMemClass& cls);
+
+    boost::shared_ptr<TInMemNamespace> fNamespace;
+    std::vector<boost::shared_ptr<TInMemQualifierDecl>> fQualifierDecls;
+    std::vector<boost::shared_ptr<TInMemClass>> fClasses;
+    std::vector<std::pair<TInMemExtent*, TInMemExtent::TMark>> fExtents;  // those of before that got instances
+    TInMemExtent* fLast = nullptr;                                        // the extent of the last instance
+    bool fCommitted = false;
+};
+
+}  // namespace NORVZEL20
