@@ -126,6 +126,12 @@ class TCIMDiffEngine {
     class TClassComparison;
 
     void CheckOperatingSystems();
+    unsigned short AppendOperatingSystems(ICIMNamespace& ns, std::vector<boost::shared_ptr<ICIMInstance>>& systems);
+    void CompareSubClasses(ICIMClass& cls);
+    void AliasInstance(ICIMInstance& instance, const std::string& key, unsigned int namespaceIndex);
+    bool IsDifferent(boost::shared_ptr<TDiffClassRules> rules, const TCIMValue& master, const TCIMValue& other);
+    boost::shared_ptr<ICIMInstance> AllocateRecord(const std::string& className);
+    static void SetProperty(ICIMInstance& instance, const std::string& name, const TCIMValue& value);
 
     boost::shared_ptr<ICIMNamespace> deltaNamespace;
     std::vector<boost::shared_ptr<ICIMNamespace>>& namespaces;  // position 0 is the reference

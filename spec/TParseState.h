@@ -18,7 +18,7 @@ class TCIMDiffEngine::TDiffXMLParser::TParseState {
 
   protected:
     /// Pushes the state of an accepted child.
-    static void Push(TDiffXMLParser& parser, TParseState* state);
+    static void Push(TDiffXMLParser& parser, boost::shared_ptr<TParseState> state);
     /// Ends the parse at an element that has no place here.
     [[noreturn]] static void Unexpected(TDiffXMLParser& parser, const std::string& name);
     /// Has the state on top read its attributes.

@@ -1,0 +1,63 @@
+#include "engine/TCIMDiffEngine.h"
+#include "provider/TDeltaClass.h"
+
+namespace NORVZEL20 {
+
+namespace {
+
+TCIMValue MakeIndexArray(const std::vector<int>& indices)
+{
+    std::vector<TCIMValue> elements(indices.size());
+    for (std::size_t i = 0; i < indices.size(); ++i) {
+        const TCIMValue element(static_cast<unsigned short>(indices[i]));
+        elements[i] = element;
+    }
+    return TCIMValue(TCIMValue::TCIMType::kArrayUint16, static_cast<unsigned int>(elements.size()), elements);
+}
+
+TCIMValue MakeReferenceTo(const ICIMInstance& instance)
+{
+    TCIMReference path = instance.GetReference(TCallContext());
+    return TCIMValue(path);
+}
+
+}  // namespace
+
+void TCIMDiffEngine::SetProperty(ICIMInstance& instance, const std::string& name, const TCIMValue& value)
+{
+    instance.GetProperty(name, TCallContext())->SetValue(value, TCallContext());
+}
+
+boost::shared_ptr<ICIMInstance> TCIMDiffEngine::AllocateRecord(const std::string& className)
+{
+    const boost::shared_ptr<ICIMClass> cls = deltaNamespace->GetClass(className, TCallContext());
+    return cls->AllocateInstance(TCallContext());
+}
+
+void TCIMDiffEngine::createCIMDiff(boost::shared_ptr<ICIMInstance> deltaClassRecord, TDeltaNamespace::EDeltaType type,
+                                   std::string instanceName, std::string propertyName, std::vector<int> namespaceIndices)
+{
+    const boost::shared_ptr<ICIMInstance> delta = AllocateRecord("KALMO_Delta");
+    SetProperty(*delta, "Type", TCIMValue(static_cast<unsigned char>(type)));
+    SetProperty(*delta, "InstanceName", TCIMValue(instanceName));
+    SetProperty(*delta, "Property", TCIMValue(propertyName));
+    SetProperty(*delta, "NamespaceIndices", MakeIndexArray(namespaceIndices));
+    delta->AddToNamespace(TCallContext());
+
+    const boost::shared_ptr<ICIMInstance> association = AllocateRecord("KALMO_DeltaClassAssocToDelta");
+    SetProperty(*association, "Class", MakeReferenceTo(*deltaClassRecord));
+    SetProperty(*association, "Delta", MakeReferenceTo(*delta));
+    association->AddToNamespace(TCallContext());
+}
+
+void TCIMDiffEngine::createObjectPathAlias(std::string className, std::string alias, const TCIMReference& path,
+                                           unsigned int nsIndex)
+{
+    const TCIMValue index(static_cast<unsigned short>(nsIndex));
+    TCallContext context;
+    context["nsIndex"] = index;
+    const boost::shared_ptr<ICIMClass> cls = deltaNamespace->GetClass(className, context);
+    boost::dynamic_pointer_cast<TDeltaClass>(cls)->AddObjectPathAlias(alias, path);
+}
+
+}  // namespace NORVZEL20

@@ -1,0 +1,52 @@
+#include "engine/TCIMDiffEngine.h"
+#include "spec/TDiffClassRules.h"
+
+namespace NORVZEL20 {
+
+bool TCIMDiffEngine::IsDifferent(boost::shared_ptr<TDiffClassRules> rules, const TCIMValue& master, const TCIMValue& other)
+{
+    if (master.GetType() != TCIMValue::TCIMType::kReference) {
+        return !(master == other);
+    }
+    if (master.IsNull() || other.IsNull()) {
+        return master.IsNull() != other.IsNull();
+    }
+    const TCIMReference masterPath = master;
+    const TCIMReference otherPath = other;
+    return buildPath(rules, masterPath) != buildPath(rules, otherPath);
+}
+
+void TCIMDiffEngine::compare(boost::shared_ptr<TDiffClassRules> rules, boost::shared_ptr<ICIMInstance> master,
+                             boost::shared_ptr<ICIMInstance> other, std::string key, std::vector<std::string>& properties,
+                             std::map<std::string, std::map<std::string, std::vector<int>>>& differences,
+                             unsigned int namespaceIndex)
+{
+    bool changed = false;
+    for (const std::string& name : properties) {
+        const boost::shared_ptr<ICIMProperty> masterProperty = master->GetProperty(name, TCallContext());
+        const boost::shared_ptr<ICIMProperty> otherProperty = other->GetProperty(name, TCallContext());
+        const TCIMValue& masterValue = masterProperty->GetValue(TCallContext());
+        const TCIMValue& otherValue = otherProperty->GetValue(TCallContext());
+        if (!IsDifferent(rules, masterValue, otherValue)) {
+            continue;
+        }
+        differences[key][name].push_back(static_cast<int>(namespaceIndex));
+        changed = true;
+        if (namespaces.size() == 2) {
+            masterProperty->MarkChanged(otherValue);
+        }
+    }
+    if (changed && rules->hasExcludedKeys()) {
+        AliasInstance(*master, key, 0);
+        AliasInstance(*other, key, namespaceIndex);
+    }
+}
+
+void TCIMDiffEngine::AliasInstance(ICIMInstance& instance, const std::string& key, unsigned int namespaceIndex)
+{
+    const boost::shared_ptr<ICIMClass> cls = instance.GetClass(TCallContext());
+    const std::string& className = cls->GetName(TCallContext());
+    createObjectPathAlias(className, key, instance.GetReference(TCallContext()), namespaceIndex);
+}
+
+}  // namespace NORVZEL20

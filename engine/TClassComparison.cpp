@@ -1,0 +1,203 @@
+#include "engine/TClassComparison.h"
+
+#include <sstream>
+#include <utility>
+
+#include "engine/TCompareInstances.h"
+#include "host/TAddToVectorCallback.h"
+#include "host/TRootObject.h"
+#include "host/TZELException.h"
+#include "spec/TDiffClassRules.h"
+
+namespace NORVZEL20 {
+
+namespace {
+
+std::vector<boost::shared_ptr<ICIMInstance>> GetInstances(ICIMClass& cls)
+{
+    std::vector<boost::shared_ptr<ICIMInstance>> instances;
+    cls.EnumerateInstances(TAddToVectorCallback<ICIMInstance>(&instances), false, TCallContext());
+    return instances;
+}
+
+std::vector<boost::shared_ptr<ICIMProperty>> GetProperties(const ICIMInstance& instance)
+{
+    std::vector<boost::shared_ptr<ICIMProperty>> properties;
+    instance.EnumerateProperties(TAddToVectorCallback<ICIMProperty>(&properties), TCallContext());
+    return properties;
+}
+
+void MarkPropertiesRemoved(const ICIMInstance& instance)
+{
+    for (const boost::shared_ptr<ICIMProperty>& property : GetProperties(instance)) {
+        if (!property->GetValue(TCallContext()).IsNull()) {
+            property->MarkRemoved();
+        }
+    }
+}
+
+}  // namespace
+
+TCIMDiffEngine::TClassComparison::TClassComparison(TCIMDiffEngine& engine, boost::shared_ptr<ICIMClass> cls)
+    : fEngine(engine), fClass(std::move(cls)), fClassName(fClass->GetName(TCallContext())),
+      fRules(engine.ruleset.getClassRules(fClassName)), fProperties(engine.buildPropList(fRules, fClass))
+{}
+
+// (1) Index the reference's instances of the class by key.
+// (2) Match the instances of each other namespace with them: keys that the other one lacks are absent, keys that the reference
+//     lacks are missing, properties of matched instances may differ.
+// (3) Without any of these, write nothing. Otherwise write the class's record, and then one for
+// (4) each absent instance,
+// (5) each missing instance, and
+// (6) each property that differs,
+//     all in the order of their keys.
+// With two namespaces, (2), (4) and (5) also bring the reference in line with the other one.
+void TCIMDiffEngine::TClassComparison::Run()
+{
+    if (fProperties.empty()) {
+        return;
+    }
+    CollectReferenceInstances();
+    for (std::size_t index = 1; index < fEngine.namespaces.size(); ++index) {
+        CompareWithNamespace(index);
+    }
+    if (!IsAnythingDifferent()) {
+        return;
+    }
+    CreateClassRecord();
+    RecordAbsentInstances();
+    RecordMissingInstances();
+    RecordDifferences();
+}
+
+void TCIMDiffEngine::TClassComparison::CollectReferenceInstances()
+{
+    std::vector<boost::shared_ptr<ICIMInstance>> instances = GetInstances(*fClass);
+    fEngine.buildInstanceMap(fRules, instances, fMaster);
+}
+
+void TCIMDiffEngine::TClassComparison::CompareWithNamespace(std::size_t index)
+{
+    if (!FindClassIn(index)) {
+        return;
+    }
+    TCompareInstances compareInstances(&fEngine, fRules, &fMaster, &fMissing, &fDifferences, static_cast<unsigned int>(index),
+                                       &fProperties);
+    fOtherClass->EnumerateInstances(compareInstances, false, TCallContext());
+    NoteAbsentInstances(index);
+}
+
+/// Whether the namespace has the class. It may lack one of which the reference has no instances.
+bool TCIMDiffEngine::TClassComparison::FindClassIn(std::size_t index)
+{
+    try {
+        fOtherClass = fEngine.namespaces[index]->GetClass(fClassName, TCallContext());
+        return true;
+    } catch (const TZELException& error) {
+        if (error.GetStatusCode() != TZELStatusCode::kNotFound) {
+            throw TZELException(error.GetStatusCode());
+        }
+    }
+    if (!fMaster.empty()) {
+        FailWithoutClassIn(index);
+    }
+    return false;
+}
+
+void TCIMDiffEngine::TClassComparison::FailWithoutClassIn(std::size_t index) const
+{
+    std::ostringstream text;
+    text << "TCIMDiffEngine: Schema do not match. (Couldn't find class " << fClassName << " in namespace " << index << ")"
+         << std::endl;
+    TRootObject::GetCoreLogger()->Log(0, text.str());
+    throw TZELException(TZELStatusCode::kSchemaMismatch);
+}
+
+void TCIMDiffEngine::TClassComparison::NoteAbsentInstances(std::size_t index)
+{
+    for (auto& [key, master] : fMaster) {
+        if (master.found == 0) {
+            fAbsent[key].push_back(static_cast<int>(index));
+        }
+        master.found = 0;
+    }
+}
+
+bool TCIMDiffEngine::TClassComparison::IsAnythingDifferent() const
+{
+    return !fAbsent.empty() || !fMissing.empty() || !fDifferences.empty();
+}
+
+void TCIMDiffEngine::TClassComparison::CreateClassRecord()
+{
+    fClassRecord = fEngine.AllocateRecord("KALMO_DeltaClass");
+    SetProperty(*fClassRecord, "ClassName", TCIMValue(fClassName));
+    fClassRecord->AddToNamespace(TCallContext());
+}
+
+void TCIMDiffEngine::TClassComparison::RecordAbsentInstances()
+{
+    const bool excludesKeys = fRules->hasExcludedKeys();
+    for (const auto& [key, indices] : fAbsent) {
+        RecordAbsentInstance(key, indices, excludesKeys);
+        if (HasTwoNamespaces()) {
+            MarkPropertiesRemoved(*fMaster[key].instance);
+        }
+    }
+}
+
+/// With excluded keys the record tells the whole path, because the key may stand for several instances.
+void TCIMDiffEngine::TClassComparison::RecordAbsentInstance(const std::string& key, const TIndices& indices, bool excludesKeys)
+{
+    if (!excludesKeys) {
+        fEngine.createCIMDiff(fClassRecord, TDeltaNamespace::kInstanceRemoved, key, "", indices);
+        return;
+    }
+    const TCIMReference path = fMaster[key].instance->GetReference(TCallContext());
+    fEngine.createObjectPathAlias(fClassName, key, path, 0);
+    fEngine.createCIMDiff(fClassRecord, TDeltaNamespace::kInstanceRemoved, path.GetPath(), "", indices);
+}
+
+void TCIMDiffEngine::TClassComparison::RecordMissingInstances()
+{
+    std::map<std::string, TMasterInstance> others;
+    if (HasTwoNamespaces()) {
+        std::vector<boost::shared_ptr<ICIMInstance>> instances = GetInstances(*fOtherClass);
+        fEngine.buildInstanceMap(fRules, instances, others);
+    }
+    for (const auto& [key, indices] : fMissing) {
+        fEngine.createCIMDiff(fClassRecord, TDeltaNamespace::kInstanceAdded, key, "", indices);
+        if (HasTwoNamespaces()) {
+            CopyToReference(*others[key].instance);
+        }
+    }
+}
+
+void TCIMDiffEngine::TClassComparison::CopyToReference(const ICIMInstance& instance)
+{
+    const boost::shared_ptr<ICIMInstance> copy = fClass->AllocateInstance(TCallContext());
+    for (const boost::shared_ptr<ICIMProperty>& property : GetProperties(instance)) {
+        const TCIMValue& value = property->GetValue(TCallContext());
+        if (!value.IsNull()) {
+            const boost::shared_ptr<const ICIMPropertyDecl> decl = property->GetPropertyDecl(TCallContext());
+            SetProperty(*copy, decl->GetName(TCallContext()), value);
+        }
+    }
+    copy->AddToNamespace(TCallContext());
+}
+
+void TCIMDiffEngine::TClassComparison::RecordDifferences()
+{
+    for (const auto& [key, properties] : fDifferences) {
+        for (const auto& [name, indices] : properties) {
+            fEngine.createCIMDiff(fClassRecord, TDeltaNamespace::kPropertyChanged, key, name, indices);
+        }
+    }
+}
+
+bool TCIMDiffEngine::TClassComparison::HasTwoNamespaces() const
+{
+    return fEngine.namespaces.size() == 2;
+}
+
+}  // namespace NORVZEL20

@@ -1,0 +1,46 @@
+#pragma once
+
+#include "engine/TCIMDiffEngine.h"
+#include "engine/TMasterInstance.h"
+
+namespace NORVZEL20 {
+
+/// The comparison of one class of the reference with the same-named class of every other namespace, without its subclasses.
+class TCIMDiffEngine::TClassComparison {
+  public:
+    TClassComparison(TCIMDiffEngine& engine, boost::shared_ptr<ICIMClass> cls);
+
+    /// Compares and writes the records. To be called once.
+    void Run();
+
+  private:
+    using TIndices = std::vector<int>;
+
+    void CollectReferenceInstances();
+    void CompareWithNamespace(std::size_t index);
+    bool FindClassIn(std::size_t index);
+    [[noreturn]] void FailWithoutClassIn(std::size_t index) const;
+    void NoteAbsentInstances(std::size_t index);
+    bool IsAnythingDifferent() const;
+    void CreateClassRecord();
+    void RecordAbsentInstances();
+    void RecordAbsentInstance(const std::string& key, const TIndices& indices, bool excludesKeys);
+    void RecordMissingInstances();
+    void RecordDifferences();
+    void CopyToReference(const ICIMInstance& instance);
+    bool HasTwoNamespaces() const;
+
+    TCIMDiffEngine& fEngine;
+    boost::shared_ptr<ICIMClass> fClass;
+    std::string fClassName;
+    boost::shared_ptr<TDiffClassRules> fRules;
+    std::vector<std::string> fProperties;
+    boost::shared_ptr<ICIMClass> fOtherClass;  // of the namespace compared last
+    std::map<std::string, TMasterInstance> fMaster;
+    std::map<std::string, TIndices> fAbsent;                              // keys that the listed namespaces lack
+    std::map<std::string, TIndices> fMissing;                             // keys that the reference lacks
+    std::map<std::string, std::map<std::string, TIndices>> fDifferences;  // key, property
+    boost::shared_ptr<ICIMInstance> fClassRecord;
+};
+
+}  // namespace NORVZEL20

@@ -1,0 +1,55 @@
+#include "provider/TDeltaNamespaceProvider.h"
+
+#include "host/TRootObject.h"
+#include "provider/TDeltaNamespace.h"
+
+namespace NORVZEL20 {
+
+namespace {
+
+void InmemInit()
+{
+    TDeltaNamespaceProvider::Initialize();
+}
+
+[[maybe_unused]] const bool kLoaded = (InmemInit(), true);
+
+}  // namespace
+
+boost::shared_ptr<TDeltaNamespaceProvider> TDeltaNamespaceProvider::GetInstance()
+{
+    static const boost::shared_ptr<TDeltaNamespaceProvider> fgInstance(new TDeltaNamespaceProvider);
+    return fgInstance;
+}
+
+TZELStatusCode TDeltaNamespaceProvider::Initialize()
+{
+    const boost::shared_ptr<INamespaceProvider> provider = GetInstance();
+    TRootObject::GetNamespaceProviderManager()->RegisterProvider(provider);
+    return TZELStatusCode::kSuccess;
+}
+
+const std::string& TDeltaNamespaceProvider::GetName(TCallContext) const
+{
+    static const std::string nspName("delta");
+    return nspName;
+}
+
+boost::shared_ptr<ICIMNamespace> TDeltaNamespaceProvider::AllocateNamespace(TCallContext, bool, std::string) const
+{
+    const boost::shared_ptr<TDeltaNamespace> ns(new TDeltaNamespace);
+    ns->Initialize();
+    return ns;
+}
+
+int TDeltaNamespaceProvider::GetType(TCallContext) const
+{
+    return 1;
+}
+
+bool TDeltaNamespaceProvider::IsIndicationsSupported(TCallContext) const
+{
+    return false;
+}
+
+}  // namespace NORVZEL20

@@ -1,0 +1,68 @@
+#include <boost/checked_delete.hpp>
+#include <cstdint>
+#include <cstdio>
+#include <new>
+
+#include "engine/TCIMDiffEngine.h"
+#include "host/TOSSpecific.h"
+#include "host/TZELException.h"
+#include "spec/TDiffXMLParser.h"
+
+namespace NORVZEL20 {
+
+namespace {
+
+const std::uint64_t kMaxSpecFileSize = 104857600;
+
+std::size_t GetSpecFileSize(const std::string& fileName)
+{
+    const std::uint64_t size = TOSSpecific::GetFileSize(fileName);
+    if (size > kMaxSpecFileSize) {
+        throw TZELException(TZELStatusCode::kParseError);
+    }
+    return static_cast<std::size_t>(size);
+}
+
+boost::shared_ptr<char> AllocateBuffer(std::size_t size)
+{
+    const boost::shared_ptr<char> buffer(new (std::nothrow) char[size], boost::checked_array_deleter<char>());
+    if (!buffer) {
+        throw TZELException(TZELStatusCode::kOutOfMemory);
+    }
+    return buffer;
+}
+
+/// Returns the number of bytes read, which is below `size` where the file has shrunk meanwhile.
+std::size_t ReadFile(const std::string& fileName, char* buffer, std::size_t size)
+{
+    std::FILE* const file = std::fopen(fileName.c_str(), "r");
+    if (file == nullptr) {
+        throw TZELException(TZELStatusCode::kFileError);
+    }
+    const std::size_t length = std::fread(buffer, 1, size, file);
+    if (std::ferror(file) != 0) {
+        // The file stays open, as the contract of ReadSpecFile has it.
+        throw TZELException(TZELStatusCode::kFileError);
+    }
+    std::fclose(file);
+    return length;
+}
+
+}  // namespace
+
+TCIMDiffEngine::TRuleset TCIMDiffEngine::ReadSpecFile(const std::string& fileName)
+{
+    const std::size_t size = GetSpecFileSize(fileName);
+    const boost::shared_ptr<char> buffer = AllocateBuffer(size);
+    const std::size_t length = ReadFile(fileName, buffer.get(), size);
+
+    TDiffXMLParser parser(namespaces.at(0));
+    try {
+        parser.Parse(buffer.get(), length);
+    } catch (const TZELException& error) {
+        throw TZELException(error.GetStatusCode());
+    }
+    return parser.getRuleset();
+}
+
+}  // namespace NORVZEL20

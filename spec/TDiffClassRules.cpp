@@ -1,0 +1,42 @@
+#include "spec/TDiffClassRules.h"
+
+#include <algorithm>
+#include <sstream>
+#include <utility>
+
+namespace NORVZEL20 {
+
+TCIMDiffEngine::TDiffClassRules::TDiffClassRules() : fDefault(EXCLUDE), fFinal(false) {}
+
+TCIMDiffEngine::TDiffClassRules::TDiffClassRules(propType def, std::map<std::string, propType> props,
+                                                 std::vector<std::string> excludedKeys)
+    : fProperties(std::move(props)), fDefault(def), fFinal(false), fExcludedKeys(std::move(excludedKeys))
+{}
+
+void TCIMDiffEngine::TDiffClassRules::updateRules(boost::shared_ptr<TDiffClassRules> other)
+{
+    fDefault = other->fDefault;
+    for (const auto& [name, type] : other->fProperties) {
+        fProperties[name] = type;
+    }
+}
+
+void TCIMDiffEngine::TDiffClassRules::excludeKeys(std::string list)
+{
+    std::istringstream words(list);
+    for (std::string word; words >> word;) {
+        fExcludedKeys.push_back(word);
+    }
+}
+
+bool TCIMDiffEngine::TDiffClassRules::hasExcludedKeys()
+{
+    return !fExcludedKeys.empty();
+}
+
+bool TCIMDiffEngine::TDiffClassRules::isKeyExcluded(const std::string& name)
+{
+    return std::find(fExcludedKeys.begin(), fExcludedKeys.end(), name) != fExcludedKeys.end();
+}
+
+}  // namespace NORVZEL20

@@ -1,0 +1,61 @@
+#include <boost/smart_ptr/make_shared.hpp>
+#include <iostream>
+
+#include "engine/TCIMDiffEngine.h"
+#include "host/TAddToVectorCallback.h"
+#include "spec/TDiffClassRules.h"
+
+namespace NORVZEL20 {
+
+std::string TCIMDiffEngine::strPropType(propType type)
+{
+    return type == INCLUDE ? "INCLUDE" : "EXCLUDE";
+}
+
+boost::shared_ptr<TCIMDiffEngine::TDiffClassRules> TCIMDiffEngine::TRuleset::getClassRules(std::string className)
+{
+    const auto entry = fRules.find(className);
+    return entry != fRules.end() ? entry->second : boost::make_shared<TDiffClassRules>();
+}
+
+void TCIMDiffEngine::TRuleset::addToRuleset(std::string className, boost::shared_ptr<TDiffClassRules> rules, bool isExplicit)
+{
+    const auto entry = fRules.find(className);
+    if (entry == fRules.end()) {
+        fRules[className] = boost::make_shared<TDiffClassRules>(rules->fDefault, rules->fProperties, rules->fExcludedKeys);
+        return;
+    }
+    if (entry->second->fFinal) {
+        return;
+    }
+    entry->second->updateRules(rules);
+    if (isExplicit) {
+        entry->second->fFinal = true;
+    }
+}
+
+void TCIMDiffEngine::TRuleset::updateRuleset(std::string className, std::string parentName, boost::shared_ptr<ICIMNamespace> schema)
+{
+    if (!parentName.empty()) {
+        addToRuleset(className, fRules[parentName], false);
+    }
+    const boost::shared_ptr<ICIMClass> cls = schema->GetClass(className, TCallContext());
+    std::vector<boost::shared_ptr<ICIMClass>> subClasses;
+    cls->EnumerateSubClasses(TAddToVectorCallback<ICIMClass>(&subClasses), false, TCallContext());
+    for (const boost::shared_ptr<ICIMClass>& subClass : subClasses) {
+        updateRuleset(subClass->GetName(TCallContext()), className, schema);
+    }
+}
+
+void TCIMDiffEngine::TRuleset::print()
+{
+    for (const auto& [className, rules] : fRules) {
+        std::cout << className << std::endl;
+        std::cout << "\tDefault:\t" << strPropType(rules->fDefault) << std::endl;
+        for (const auto& [name, type] : rules->fProperties) {
+            std::cout << '\t' << name << '\t' << strPropType(type) << std::endl;
+        }
+    }
+}
+
+}  // namespace NORVZEL20
