@@ -1,0 +1,16 @@
+# The installed package: find_package(cimdelta) gives cimdelta::host, cimdelta::zelcore and cimdelta::delta.
+include(CMakePackageConfigHelpers)
+
+set(cimdelta_config_dir ${CMAKE_INSTALL_LIBDIR}/cmake/cimdelta)
+
+install(TARGETS host zelcore delta cimdelta EXPORT cimdelta-targets
+  RUNTIME DESTINATION ${CMAKE_INSTALL_BINDIR}
+  LIBRARY DESTINATION ${CMAKE_INSTALL_LIBDIR})
+foreach(folder host embedded provider spec engine)
+  install(DIRECTORY ${folder}/ DESTINATION ${CMAKE_INSTALL_INCLUDEDIR}/cimdelta/${folder} FILES_MATCHING PATTERN "*.h")
+endforeach()
+install(EXPORT cimdelta-targets NAMESPACE cimdelta:: DESTINATION ${cimdelta_config_dir})
+configure_package_config_file(cmake/Config.cmake.in ${PROJECT_BINARY_DIR}/cimdelta-config.cmake INSTALL_DESTINATION ${cimdelta_config_dir})
+write_basic_package_version_file(${PROJECT_BINARY_DIR}/cimdelta-config-version.cmake COMPATIBILITY SameMinorVersion)
+install(FILES ${PROJECT_BINARY_DIR}/cimdelta-config.cmake ${PROJECT_BINARY_DIR}/cimdelta-config-version.cmake
+  DESTINATION ${cimdelta_config_dir})

@@ -1,0 +1,32 @@
+#pragma once
+
+#include <boost/smart_ptr/shared_ptr.hpp>
+#include <set>
+#include <string>
+#include <vector>
+
+#include "embedded/TInMemNamespace.h"
+#include "provider/TDeltaNamespace.h"
+
+namespace NORVZEL20 {
+
+/// A comparison of two inventory files through the plug-in, told as lines like those of ReadOracle.
+class TInventoryRun {
+  public:
+    TInventoryRun(const std::string& reference, const std::string& other);
+
+    /// Compares every property of the named classes.
+    void Compare(const std::vector<std::string>& classes);
+
+    std::set<std::string> Differences(bool withValues) const;
+
+  private:
+    std::string Describe(ICIMInstance& record, bool withValues) const;
+    std::string ValuesOf(const std::string& path, const std::string& property) const;
+
+    boost::shared_ptr<TInMemNamespace> fReference;
+    boost::shared_ptr<TInMemNamespace> fOther;
+    boost::shared_ptr<TDeltaNamespace> fDelta;
+};
+
+}  // namespace NORVZEL20

@@ -1,0 +1,20 @@
+# Fails at the first step that fails.
+function(run)
+  execute_process(COMMAND ${ARGN} COMMAND_ERROR_IS_FATAL ANY)
+endfunction()
+
+file(REMOVE_RECURSE ${WORK_DIR})
+run(${CMAKE_COMMAND} --install ${BUILD_DIR} --prefix ${WORK_DIR}/prefix)
+set(flags "")
+if(SANITIZE)
+  set(flags "-fsanitize=${SANITIZE}")
+endif()
+run(${CMAKE_COMMAND} -S ${USER_SOURCE} -B ${WORK_DIR}/build -G Ninja -DCMAKE_CXX_COMPILER=${CXX} -DCMAKE_PREFIX_PATH=${WORK_DIR}/prefix
+    -DCMAKE_CXX_FLAGS=${flags})
+run(${CMAKE_COMMAND} --build ${WORK_DIR}/build)
+set(ENV{CIMDELTA_ROOT} ${WORK_DIR}/prefix/share/cimdelta)
+execute_process(COMMAND ${WORK_DIR}/build/user ${WORK_DIR}/prefix/lib OUTPUT_VARIABLE output COMMAND_ERROR_IS_FATAL ANY)
+if(NOT output STREQUAL "delta: 2 containers\n")
+  message(FATAL_ERROR "the user's program printed: ${output}")
+endif()
+run(${WORK_DIR}/prefix/bin/cimdelta --version)
