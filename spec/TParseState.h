@@ -19,12 +19,12 @@ class TCIMDiffEngine::TDiffXMLParser::TParseState {
   protected:
     /// Pushes the state of an accepted child.
     static void Push(TDiffXMLParser& parser, boost::shared_ptr<TParseState> state);
-    /// Ends the parse at an element that has no place here.
-    [[noreturn]] static void Unexpected(TDiffXMLParser& parser, const std::string& name);
+    /// Ends the parse at an element that has no place here; never returns.
+    static void Unexpected(TDiffXMLParser& parser, const std::string& name);
     /// Has the state on top read its attributes.
     static void HandleAttrsOfTop(TDiffXMLParser& parser, std::map<std::string, std::string>& attrs);
-    /// Ends the parse with `what`, the current line, `then` and a line end.
-    [[noreturn]] static void FailOnLine(TDiffXMLParser& parser, const std::string& what, const std::string& then = std::string());
+    /// Ends the parse with `what`, the current line, `then` and a line end; never returns.
+    static void FailOnLine(TDiffXMLParser& parser, const std::string& what, const std::string& then = std::string());
 };
 
 }  // namespace NORVZEL20
