@@ -1,0 +1,28 @@
+#pragma once
+
+#include <string>
+
+#include "host/ILogger.h"
+
+namespace NORVZEL20 {
+
+/// Takes the place of the core log while it lives, and keeps what is written: `level|message|` for each entry, line ends as
+/// written.
+class TCapturingLogger : public ILogger {
+  public:
+    TCapturingLogger();
+    TCapturingLogger(const TCapturingLogger&) = delete;
+    TCapturingLogger& operator=(const TCapturingLogger&) = delete;
+    ~TCapturingLogger() override;
+
+    void Log(int level, const std::string& message) override;
+
+    /// Everything written since the last call.
+    std::string Take();
+
+  private:
+    ILogger* fBefore;
+    std::string fText;
+};
+
+}  // namespace NORVZEL20

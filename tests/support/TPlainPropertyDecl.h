@@ -1,0 +1,37 @@
+#pragma once
+
+#include <string>
+#include <vector>
+
+#include "host/ICIMPropertyDecl.h"
+
+namespace NORVZEL20 {
+
+/// A property declaration of the plain host. It is a key once a qualifier "Key" was put on it.
+class TPlainPropertyDecl : public ICIMPropertyDecl {
+  public:
+    TPlainPropertyDecl(std::string name, TCIMValue defaultValue);
+
+    bool IsKey() const;
+
+    const std::string& GetName(TCallContext context) const override;
+    TCIMValue::TCIMType GetType(TCallContext context) const override;
+    const TCIMValue& GetDefaultValue(TCallContext context) const override;
+
+    void AddQualifier(boost::shared_ptr<ICIMQualifier> qualifier, TCallContext context) override;
+    boost::shared_ptr<ICIMQualifier> AllocateQualifier(boost::shared_ptr<const ICIMQualifierDecl> decl, const TCIMValue& value,
+                                                       TCallContext context) const override;
+    boost::shared_ptr<ICIMQualifier> AllocateQualifier(boost::shared_ptr<const ICIMQualifierDecl> decl, const TCIMValue& value,
+                                                       ICIMQualifierDecl::EFlavor flavor, TCallContext context) const override;
+    boost::shared_ptr<ICIMQualifier> GetQualifier(const std::string& name, TCallContext context) const override;
+    void EnumerateQualifiers(const boost::function<bool(boost::shared_ptr<ICIMQualifier>)>& callback,
+                             TCallContext context) const override;
+    boost::shared_ptr<ICIMQualifier> GetQualifier(const std::string& name, bool& found, TCallContext context) const override;
+
+  private:
+    std::string fName;
+    TCIMValue fDefault;
+    std::vector<boost::shared_ptr<ICIMQualifier>> fQualifiers;
+};
+
+}  // namespace NORVZEL20
