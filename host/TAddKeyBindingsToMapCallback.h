@@ -17,9 +17,9 @@ class TAddKeyBindingsToMapCallback : public TUnaryFunction<std::pair<std::string
     explicit TAddKeyBindingsToMapCallback(std::map<std::string, TCIMValue>* bindings) : fBindings(bindings) {}
 
     /// Always true: the enumeration goes on.
-    bool operator()(std::pair<std::string, TCIMValue> binding) const
+    bool operator()(const std::pair<std::string, TCIMValue>& binding) const
     {
-        fBindings->insert(std::move(binding));
+        fBindings->insert(binding);
         return true;
     }
 
