@@ -1,0 +1,99 @@
+#include <gmock/gmock.h>
+
+#include <boost/smart_ptr/make_shared.hpp>
+
+#include "embedded/TAssertionFailure.h"
+#include "spec/TDiffClassRules.h"
+#include "tests/support/Dump.h"
+#include "tests/support/TCapturingLogger.h"
+
+namespace NORVZEL20 {
+namespace {
+
+using testing::ElementsAre;
+using TRules = TCIMDiffEngine::TDiffClassRules;
+constexpr auto INCLUDE = TCIMDiffEngine::INCLUDE;
+constexpr auto EXCLUDE = TCIMDiffEngine::EXCLUDE;
+
+TEST(PropTypeTest, NumbersAndTextsAreFixed)
+{
+    EXPECT_EQ(0, INCLUDE);
+    EXPECT_EQ(1, EXCLUDE);
+    EXPECT_EQ("INCLUDE", TCIMDiffEngine::strPropType(INCLUDE));
+    EXPECT_EQ("EXCLUDE", TCIMDiffEngine::strPropType(EXCLUDE));
+}
+
+TEST(ClassRulesTest, NewRulesExcludeEverything)
+{
+    const TRules rules;
+    EXPECT_EQ("", rules.fClassName);
+    EXPECT_FALSE(rules.fFinal);
+    EXPECT_EQ("exclude\n", DumpRules(rules));
+}
+
+TEST(ClassRulesTest, RulesKeepWhatTheyAreMadeWith)
+{
+    const TRules rules(INCLUDE, {{"B", EXCLUDE}, {"A", INCLUDE}}, {"K2", "K1", "K2"});
+    EXPECT_EQ("", rules.fClassName);
+    EXPECT_EQ("include A:INCLUDE B:EXCLUDE -K2 -K1 -K2\n", DumpRules(rules));
+}
+
+TEST(ClassRulesTest, UpdateTakesDefaultAndListedPropertiesAlone)
+{
+    TRules rules(INCLUDE, {{"A", INCLUDE}, {"B", INCLUDE}}, {"K"});
+    rules.fClassName = "Disk";
+    rules.fFinal = true;
+    const auto other = boost::make_shared<TRules>(
+        EXCLUDE, std::map<std::string, TCIMDiffEngine::propType>{{"B", EXCLUDE}, {"C", INCLUDE}}, std::vector<std::string>{"L"});
+    other->fClassName = "Other";
+    rules.updateRules(other);
+    EXPECT_EQ("exclude final A:INCLUDE B:EXCLUDE C:INCLUDE -K\n", DumpRules(rules));
+    EXPECT_EQ("Disk", rules.fClassName);
+    EXPECT_EQ("exclude B:EXCLUDE C:INCLUDE -L\n", DumpRules(*other));
+}
+
+TEST(ClassRulesTest, UpdateWithNothingFailsTheAssertion)
+{
+    TCapturingLogger log;
+    TRules rules;
+    EXPECT_THROW(rules.updateRules(nullptr), TAssertionFailure);
+}
+
+TEST(ExcludedKeysTest, AnyWhiteSpaceSeparatesNames)
+{
+    TRules rules;
+    rules.excludeKeys("  KeyA\t\tKeyB\n KeyC \r\n");
+    EXPECT_THAT(rules.fExcludedKeys, ElementsAre("KeyA", "KeyB", "KeyC"));
+    EXPECT_TRUE(rules.hasExcludedKeys());
+}
+
+TEST(ExcludedKeysTest, NamesAreAddedAndRepeatedOnesKept)
+{
+    TRules rules;
+    rules.excludeKeys("A B");
+    rules.excludeKeys("B C");
+    EXPECT_THAT(rules.fExcludedKeys, ElementsAre("A", "B", "B", "C"));
+}
+
+TEST(ExcludedKeysTest, EmptyOrBlankTextAddsNothing)
+{
+    TRules rules;
+    rules.excludeKeys("");
+    rules.excludeKeys(" \t\n ");
+    EXPECT_FALSE(rules.hasExcludedKeys());
+    EXPECT_FALSE(rules.isKeyExcluded(""));
+}
+
+TEST(ExcludedKeysTest, LetterCaseCounts)
+{
+    TRules rules;
+    rules.excludeKeys("Name Id");
+    EXPECT_TRUE(rules.isKeyExcluded("Name"));
+    EXPECT_TRUE(rules.isKeyExcluded("Id"));
+    EXPECT_FALSE(rules.isKeyExcluded("NAME"));
+    EXPECT_FALSE(rules.isKeyExcluded("Nam"));
+    EXPECT_FALSE(rules.isKeyExcluded("Name Id"));
+}
+
+}  // namespace
+}  // namespace NORVZEL20

@@ -1,0 +1,198 @@
+#include <boost/smart_ptr/make_shared.hpp>
+
+#include "host/TZELException.h"
+#include "spec/TDiffXMLParser.h"
+#include "tests/spec/TSpecFixture.h"
+
+namespace NORVZEL20 {
+namespace {
+
+enum class EEvent { kStart, kEnd };
+
+// A document with one error; each tag stands on a line of its own, so that the line tells the tag.
+struct TBadSpec {
+    std::string document;
+    unsigned int line;
+    std::string message;  // '#' stands for the line
+    EEvent event = EEvent::kStart;
+};
+
+std::string WithLine(const std::string& message, unsigned int line)
+{
+    std::string text;
+    for (const char c : message) {
+        text += c == '#' ? std::to_string(line) : std::string(1, c);
+    }
+    return text;
+}
+
+std::string BarrierEntry(EEvent event, TZELStatusCode::EStatusCode status, unsigned int line)
+{
+    const std::string start = event == EEvent::kStart ? "TDiffXMLParser: Thrown exception in StartElement "
+                                                      : "TDiffXMLParser: Threw exception in EndElement";
+    return "0|" + start + TextOf(status) + " on line " + std::to_string(line) + "|";
+}
+
+std::string BothEntries(const TBadSpec& bad)
+{
+    return "0|Diff-XML Parser line " + std::to_string(bad.line) + ":" + WithLine(bad.message, bad.line) + "|" +
+           BarrierEntry(bad.event, TZELStatusCode::kParseError, bad.line);
+}
+
+const std::string kVersion = "Unknown TCIMDiffEngineSpec version";
+const std::string kParameter = "Unknown parameter specified on line #\n";
+const std::string kDefault = "Invalid default specified on line #\n";
+const std::string kNoName = "Class specified on line #has no name\n";
+const std::string kNoClass = "Class specified on line # was not found in the schema\n";
+
+std::string InClass(const std::string& inner)
+{
+    return "<DifftoolSpec>\n<class name=\"Other\">\n" + inner + "\n</class>\n</DifftoolSpec>";
+}
+
+std::string InValue(const std::string& text)
+{
+    return InClass("<includelist>\n<value>" + text + "</value>\n</includelist>");
+}
+
+const std::vector<TBadSpec> kBadRoots = {
+    {"<difftoolspec/>", 1, "Unexpected element difftoolspec"},
+    {"\n\n<DiffToolSpec>\n</DiffToolSpec>", 3, "Unexpected element DiffToolSpec"},
+    {"<class name=\"Other\"/>", 1, "Unexpected element class"},
+    {"<x:DifftoolSpec xmlns:x=\"u\"/>", 1, "Unexpected element x:DifftoolSpec"},
+    {"<DifftoolSpec version=\"1.1\"/>", 1, kVersion},
+    {"<?xml version=\"1.0\"?>\n<DifftoolSpec version=\"1.00\"/>", 2, kVersion},
+    {"<DifftoolSpec foo=\"1.0\"/>", 1, kVersion},
+    {"<DifftoolSpec Version=\"1.0\"/>", 1, kVersion},
+    {"<DifftoolSpec version=\"1.0\" zoo=\"\"/>", 1, kVersion},
+    {"<DifftoolSpec>\n<Class name=\"Other\"/>\n</DifftoolSpec>", 2, "Unexpected element Class"},
+    {"<DifftoolSpec>\n\n<includelist/>\n</DifftoolSpec>", 3, "Unexpected element includelist"},
+    {"<DifftoolSpec>\n<DifftoolSpec/>\n</DifftoolSpec>", 2, "Unexpected element DifftoolSpec"},
+};
+
+const std::vector<TBadSpec> kBadClasses = {
+    {"<DifftoolSpec>\n<class name=\"Other\" Default=\"include\"/>\n</DifftoolSpec>", 2, kParameter},
+    {"<DifftoolSpec>\n\n\n<class name=\"Other\" zoo=\"1\"/>\n</DifftoolSpec>", 4, kParameter},
+    {"<DifftoolSpec>\n<class excludeKeys=\"Id\" name=\"Other\"/>\n</DifftoolSpec>", 2, kParameter},
+    {"<DifftoolSpec>\n<class default=\"Include\" name=\"Other\"/>\n</DifftoolSpec>", 2, kDefault},
+    {"<DifftoolSpec>\n<class default=\"\" name=\"Other\"/>\n</DifftoolSpec>", 2, kDefault},
+    {"<DifftoolSpec>\n<class default=\"include \" name=\"Other\"/>\n</DifftoolSpec>", 2, kDefault},
+    {"<DifftoolSpec>\n<class default=\"includes\"/>\n</DifftoolSpec>", 2, kDefault},
+    {"<DifftoolSpec>\n<class zoo=\"\" default=\"x\"/>\n</DifftoolSpec>", 2, kDefault},
+    {"<DifftoolSpec>\n<class aaa=\"\" default=\"x\"/>\n</DifftoolSpec>", 2, kParameter},
+    {"<DifftoolSpec>\n<class name=\"Nowhere\" zoo=\"\"/>\n</DifftoolSpec>", 2, kParameter},
+    {"<DifftoolSpec>\n<class/>\n</DifftoolSpec>", 2, kNoName},
+    {"<DifftoolSpec>\n<class name=\"\"/>\n</DifftoolSpec>", 2, kNoName},
+    {"<DifftoolSpec>\n<class default=\"include\"/>\n</DifftoolSpec>", 2, kNoName},
+    {"<DifftoolSpec>\n<class name=\"Nowhere\"/>\n</DifftoolSpec>", 2, kNoClass},
+    {"<DifftoolSpec>\n<class name=\" Other\"/>\n</DifftoolSpec>", 2, kNoClass},
+    {"<DifftoolSpec>\n<class name=\"Other\"/>\n<class name=\"Nowhere\"/>\n</DifftoolSpec>", 3, kNoClass},
+};
+
+const std::vector<TBadSpec> kBadLists = {
+    {InClass("<value>A</value>"), 3, "Unexpected element value"},
+    {InClass("<class name=\"Other\"/>"), 3, "Unexpected element class"},
+    {InClass("<IncludeList/>"), 3, "Unexpected element IncludeList"},
+    {InClass("<includelist>\n<Value>A</Value>\n</includelist>"), 4, "Unexpected element Value"},
+    {InClass("<excludelist>\n<includelist/>\n</excludelist>"), 4, "Unexpected element includelist"},
+    {InClass("<excludelist>\n<excludelist/>\n</excludelist>"), 4, "Unexpected element excludelist"},
+    {InClass("<includelist>\n<value>A<x/></value>\n<value>A</value>\n</includelist>"), 5, "Unexpected element value"},
+    {InValue("Z"), 4, "Invalid property \"Z\" specified on line #\n", EEvent::kEnd},
+    {InValue(""), 4, "Invalid property \"\" specified on line #\n", EEvent::kEnd},
+    {InValue(" A "), 4, "Invalid property \" A \" specified on line #\n", EEvent::kEnd},
+    {InValue("a"), 4, "Invalid property \"a\" specified on line #\n", EEvent::kEnd},
+    {InValue("\nA"), 5, "Invalid property \"\nA\" specified on line #\n", EEvent::kEnd},
+    {InClass("<excludelist>\n<value>Z</value>\n</excludelist>"), 4, "Invalid property \"Z\" specified on line #\n", EEvent::kEnd},
+    {InValue("Z<x/>"), 4, "Invalid property \"Z\" specified on line #\n", EEvent::kEnd},
+};
+
+class SpecErrorsTest : public TSpecFixture {
+  protected:
+    void ExpectBothEntries(const std::vector<TBadSpec>& table)
+    {
+        for (const auto& bad : table) {
+            EXPECT_EQ("status 9", Read(bad.document)) << bad.document;
+            EXPECT_EQ(BothEntries(bad), TakeLog()) << bad.document;
+        }
+    }
+};
+
+TEST_F(SpecErrorsTest, WrongRootsAreLoggedTwiceWithTheirLine)
+{
+    ExpectBothEntries(kBadRoots);
+}
+
+TEST_F(SpecErrorsTest, WrongClassesAreLoggedTwiceWithTheirLine)
+{
+    ExpectBothEntries(kBadClasses);
+}
+
+TEST_F(SpecErrorsTest, WrongListsAreLoggedTwiceWithTheirLine)
+{
+    ExpectBothEntries(kBadLists);
+}
+
+TEST_F(SpecErrorsTest, TheFullTextOfAnErrorOnLineTwelve)
+{
+    std::string document = "<DifftoolSpec>\n";
+    document.append(10, '\n');
+    EXPECT_EQ("status 9", Read(document + "<class name=\"Nowhere\"/></DifftoolSpec>"));
+    const std::string log = TakeLog();
+    EXPECT_EQ("0|Diff-XML Parser line 12:Class specified on line 12 was not found in the schema\n|"
+              "0|TDiffXMLParser: Thrown exception in StartElement " +
+                  TextOf(TZELStatusCode::kParseError) + " on line 12|",
+              log);
+    EXPECT_EQ(std::string::npos, log.find("Previous error"));
+}
+
+TEST_F(SpecErrorsTest, AnotherFailureOfTheClassLookUpKeepsItsStatus)
+{
+    fComparison.GetWatch().FailCallsOf("ns0.GetClass(\"Other\")", TZELStatusCode::kNamespaceGone);
+    EXPECT_EQ("status 18", Read("<DifftoolSpec>\n<class name=\"Other\"/></DifftoolSpec>"));
+    EXPECT_EQ(BarrierEntry(EEvent::kStart, TZELStatusCode::kNamespaceGone, 2), TakeLog());
+}
+
+TEST_F(SpecErrorsTest, AnotherFailureOfThePropertyLookUpKeepsItsStatus)
+{
+    fComparison.GetWatch().FailCallsOf("ns0:Other.GetPropertyDecl(\"A\")", TZELStatusCode::kTypeMismatch);
+    EXPECT_EQ("status 13", Read(InValue("A")));
+    EXPECT_EQ(BarrierEntry(EEvent::kEnd, TZELStatusCode::kTypeMismatch, 4), TakeLog());
+}
+
+TEST_F(SpecErrorsTest, AFailureOfThePushDownKeepsItsStatus)
+{
+    fComparison.GetWatch().FailCallsOf("ns0:Other.EnumerateSubClasses", TZELStatusCode::kNotFound);
+    EXPECT_EQ("status 15", Read("<DifftoolSpec>\n<class name=\"Other\">\n</class></DifftoolSpec>"));
+    EXPECT_EQ(BarrierEntry(EEvent::kEnd, TZELStatusCode::kNotFound, 3), TakeLog());
+}
+
+TEST_F(SpecErrorsTest, MalformedXmlIsLoggedOnceWithTheHostsMessage)
+{
+    EXPECT_EQ("status 9", Read("<DifftoolSpec>\n<class name=\"Other\"></DifftoolSpec>"));
+    const std::string log = TakeLog();
+    const std::string start = "0|Diff-XML Parser line 2:";
+    EXPECT_EQ(start, log.substr(0, start.size()));
+    EXPECT_LT(start.size() + 1, log.size());
+    EXPECT_EQ(std::string::npos, log.find("exception in"));
+}
+
+TEST_F(SpecErrorsTest, FatalErrorLogsItsMessageAndThrows)
+{
+    TCIMDiffEngine::TDiffXMLParser parser(fNamespaces[0]);
+    try {
+        parser.FatalError("a message");
+        FAIL() << "nothing was thrown";
+    } catch (const TZELException& error) {
+        EXPECT_EQ(TZELStatusCode::kParseError, error.GetStatusCode().GetStatus());
+    }
+    EXPECT_EQ("0|Diff-XML Parser line " + std::to_string(parser.GetCurLine()) + ":a message|", TakeLog());
+}
+
+TEST_F(SpecErrorsTest, NothingOfABadDocumentIsLeftBehind)
+{
+    EXPECT_EQ("status 9", Read("<DifftoolSpec><class name=\"Base\"/><class/></DifftoolSpec>"));
+    EXPECT_EQ("Other exclude\n", Read("<DifftoolSpec><class name=\"Other\"/></DifftoolSpec>"));
+}
+
+}  // namespace
+}  // namespace NORVZEL20

@@ -1,0 +1,182 @@
+#include <dlfcn.h>
+#include <sys/resource.h>
+#include <unistd.h>
+
+#include <cstdint>
+#include <filesystem>
+#include <fstream>
+#include <new>
+#include <optional>
+
+#include "host/TOSSpecific.h"
+#include "tests/spec/TSpecFixture.h"
+
+// Present only where the program is built with the leak checker.
+extern "C" void __lsan_disable() __attribute__((weak));
+extern "C" void __lsan_enable() __attribute__((weak));
+
+namespace {
+
+std::optional<std::uint64_t> gFileSize;  // what the host shall say of any file
+bool gIsMemoryShort = false;
+
+}  // namespace
+
+// Without memory for it, an array asked for in this form is a null pointer.
+void* operator new[](std::size_t size, const std::nothrow_t&) noexcept
+{
+    if (gIsMemoryShort) {
+        return nullptr;
+    }
+    try {
+        return ::operator new[](size);
+    } catch (const std::bad_alloc&) {
+        return nullptr;
+    }
+}
+
+namespace NORVZEL20 {
+
+// Stands in front of the host's own operation, so that a test can have it say anything.
+std::uint64_t TOSSpecific::GetFileSize(std::string path)
+{
+    if (gFileSize) {
+        return *gFileSize;
+    }
+    using TOperation = std::uint64_t (*)(std::string);
+    static const auto original = reinterpret_cast<TOperation>(
+        dlsym(RTLD_NEXT, "_ZN8NORVZEL2011TOSSpecific11GetFileSizeENSt7__cxx1112basic_stringIcSt11char_traitsIcESaIcEEE"));
+    return original(path);
+}
+
+namespace {
+
+constexpr std::uint64_t kLimit = 104857600;
+
+class SpecFileLoadingTest : public TSpecFixture {
+  protected:
+    ~SpecFileLoadingTest() override
+    {
+        gFileSize.reset();
+        gIsMemoryShort = false;
+    }
+
+    static std::size_t OpenFiles()
+    {
+        std::size_t count = 0;
+        for (int descriptor = 0; descriptor < 1024; ++descriptor) {
+            count += lseek(descriptor, 0, SEEK_CUR) != -1 || errno != EBADF ? 1 : 0;
+        }
+        return count;
+    }
+};
+
+TEST_F(SpecFileLoadingTest, AFileIsReadAndClosed)
+{
+    const std::size_t before = OpenFiles();
+    EXPECT_EQ("Other include\n", Read("<DifftoolSpec><class name=\"Other\" default=\"include\"/></DifftoolSpec>"));
+    EXPECT_EQ("", TakeLog());
+    EXPECT_EQ(before, OpenFiles());
+}
+
+TEST_F(SpecFileLoadingTest, AMissingFileFailsAsTheHostSays)
+{
+    EXPECT_EQ("status 11", ReadFile("/nonexistent/rules.xml"));
+    EXPECT_EQ("", TakeLog());
+}
+
+TEST_F(SpecFileLoadingTest, AFileThatHasASizeButCannotBeOpenedIsReported)
+{
+    gFileSize = 10;
+    EXPECT_EQ("status 11", ReadFile("/nonexistent/rules.xml"));
+    EXPECT_EQ("", TakeLog());
+}
+
+TEST_F(SpecFileLoadingTest, AReadErrorIsReportedAndLeavesTheFileOpen)
+{
+    const std::size_t before = OpenFiles();
+    gFileSize = 10;
+    if (__lsan_disable) {
+        __lsan_disable();
+    }
+    EXPECT_EQ("status 11", ReadFile("/tmp"));  // a folder can be opened, but not read
+    if (__lsan_enable) {
+        __lsan_enable();
+    }
+    EXPECT_EQ(before + 1, OpenFiles());
+    EXPECT_EQ("", TakeLog());
+}
+
+TEST_F(SpecFileLoadingTest, WithoutMemoryTheFileIsNotRead)
+{
+    const TTemporaryFile file("<DifftoolSpec/>");
+    gIsMemoryShort = true;
+    EXPECT_EQ("status 4", ReadFile(file.GetPath()));
+    gFileSize = kLimit;
+    EXPECT_EQ("status 4", ReadFile("/nonexistent/rules.xml"));
+    EXPECT_EQ("", TakeLog());
+}
+
+TEST_F(SpecFileLoadingTest, AFileAboveTheLimitIsRefusedBeforeItIsOpened)
+{
+    gIsMemoryShort = true;
+    for (const std::uint64_t size : {kLimit + 1, std::uint64_t(1) << 32, (std::uint64_t(1) << 32) + 10, ~std::uint64_t(0)}) {
+        gFileSize = size;
+        EXPECT_EQ("status 9", ReadFile("/nonexistent/rules.xml")) << size;
+        EXPECT_EQ("", TakeLog());
+    }
+}
+
+TEST_F(SpecFileLoadingTest, AFileAtTheLimitIsRead)
+{
+    const TTemporaryFile file("<DifftoolSpec><class name=\"Other\"/></DifftoolSpec>");
+    {
+        std::ofstream out(file.GetPath(), std::ios::app);
+        out << std::string(kLimit - std::filesystem::file_size(file.GetPath()), ' ');
+    }
+    ASSERT_EQ(kLimit, std::filesystem::file_size(file.GetPath()));
+    EXPECT_EQ("Other exclude\n", ReadFile(file.GetPath()));
+    std::ofstream(file.GetPath(), std::ios::app) << ' ';
+    EXPECT_EQ("status 9", ReadFile(file.GetPath()));
+    EXPECT_EQ("", TakeLog());
+}
+
+TEST_F(SpecFileLoadingTest, AnEmptyFileFailsInTheParser)
+{
+    EXPECT_EQ("status 9", Read(""));
+    const std::string log = TakeLog();
+    const std::string start = "0|Diff-XML Parser line 1:";
+    EXPECT_EQ(start, log.substr(0, start.size()));
+    EXPECT_EQ(std::string::npos, log.find("exception in"));
+}
+
+TEST_F(SpecFileLoadingTest, TheParserGetsTheFilesBytesAndNoMore)
+{
+    EXPECT_EQ("", Read("<DifftoolSpec/>"));
+    EXPECT_EQ("status 9", Read(std::string("<DifftoolSpec/>\0", 16)));
+    EXPECT_EQ("status 9", Read(std::string("<DifftoolSpec/>\0<x/>", 20)));
+}
+
+TEST_F(SpecFileLoadingTest, AFileThatShrankIsReadAsItIs)
+{
+    const TTemporaryFile file("<DifftoolSpec/>");
+    gFileSize = 1000;
+    EXPECT_EQ("", ReadFile(file.GetPath()));
+}
+
+TEST_F(SpecFileLoadingTest, AFileThatGrewIsReadUpToTheSizeItHad)
+{
+    const TTemporaryFile file("<DifftoolSpec/><!-- open");
+    gFileSize = 15;
+    EXPECT_EQ("", ReadFile(file.GetPath()));
+}
+
+TEST_F(SpecFileLoadingTest, AParseErrorGivesBackFileAndMemory)
+{
+    const std::size_t before = OpenFiles();
+    EXPECT_EQ("status 9", Read("<DifftoolSpec>"));
+    EXPECT_EQ(before, OpenFiles());
+}
+
+}  // namespace
+}  // namespace NORVZEL20
