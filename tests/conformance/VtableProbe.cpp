@@ -1,0 +1,58 @@
+// Has the compiler lay out the virtual table of every type whose order of operations is part of the contract: a destructor sets
+// the table of its class. Compiled for the dump alone, never linked.
+#include "host/ICIMClass.h"
+#include "host/ICIMInstance.h"
+#include "host/ICIMNamespace.h"
+#include "host/ICIMProperty.h"
+#include "host/ICIMPropertyDecl.h"
+#include "host/ILogger.h"
+#include "host/INamespaceProvider.h"
+#include "host/INamespaceProviderManager.h"
+#include "host/TNamespaceProviderManager.h"
+#include "host/TXmlParser.h"
+#include "provider/TDeltaClass.h"
+#include "provider/TDeltaNamespace.h"
+#include "provider/TDeltaNamespaceProvider.h"
+#include "spec/TStateClass.h"
+#include "spec/TStateDTS.h"
+#include "spec/TStateExcludeList.h"
+#include "spec/TStateIncludeList.h"
+#include "spec/TStateStart.h"
+#include "spec/TStateValue.h"
+
+namespace NORVZEL20 {
+
+// The compiler names a table after its class alone, so that each probe needs a name of its own.
+#define PROBE(name, type)                                                                                                          \
+    struct TProbeOf##name : type {                                                                                                 \
+        ~TProbeOf##name() override;                                                                                                \
+    };                                                                                                                             \
+    TProbeOf##name::~TProbeOf##name() = default
+
+using TParser = TCIMDiffEngine::TDiffXMLParser;
+
+PROBE(ICIMElement, ICIMElement);
+PROBE(ICIMNamedElement, ICIMNamedElement);
+PROBE(ICIMClass, ICIMClass);
+PROBE(ICIMNamespace, ICIMNamespace);
+PROBE(ICIMInstance, ICIMInstance);
+PROBE(ICIMProperty, ICIMProperty);
+PROBE(ICIMPropertyDecl, ICIMPropertyDecl);
+PROBE(ILogger, ILogger);
+PROBE(INamespaceProvider, INamespaceProvider);
+PROBE(INamespaceProviderManager, INamespaceProviderManager);
+PROBE(TNamespaceProviderManager, TNamespaceProviderManager);
+PROBE(TXmlParser, TXmlParser);
+PROBE(TDeltaNamespaceProvider, TDeltaNamespaceProvider);
+PROBE(TDeltaNamespace, TDeltaNamespace);
+PROBE(TDeltaClass, TDeltaClass);
+PROBE(TDiffXMLParser, TParser);
+PROBE(TParseState, TParser::TParseState);
+PROBE(TStateStart, TParser::TStateStart);
+PROBE(TStateDTS, TParser::TStateDTS);
+PROBE(TStateClass, TParser::TStateClass);
+PROBE(TStateIncludeList, TParser::TStateIncludeList);
+PROBE(TStateExcludeList, TParser::TStateExcludeList);
+PROBE(TStateValue, TParser::TStateValue);
+
+}  // namespace NORVZEL20
