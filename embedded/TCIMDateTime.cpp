@@ -1,1 +1,233 @@
 #include "host/TCIMDateTime.h"
+
+#include <array>
+#include <cstdlib>
+
+namespace NORVZEL20 {
+
+namespace {
+
+constexpr std::size_t kLength = 25;
+constexpr std::size_t kPoint = 14;         // the position of the decimal point
+constexpr std::size_t kMicroseconds = 15;  // and of the first digit behind it
+constexpr std::size_t kSign = 21;
+constexpr unsigned int kFirstMicrosecondBit = 6;
+constexpr std::int64_t kSecond = 1000000;
+constexpr std::int64_t kMinute = 60 * kSecond;
+constexpr std::int64_t kHour = 60 * kMinute;
+constexpr std::int64_t kDay = 24 * kHour;
+
+/// One field of the text: where it stands, its bit among the unknown ones, and its range.
+struct TField {
+    std::size_t fStart;
+    std::size_t fLength;
+    unsigned int fBit;
+    std::int64_t fLeast;
+    std::int64_t fGreatest;
+};
+
+constexpr std::array<TField, 6> kTimestampFields{
+    {{0, 4, 0, 0, 9999}, {4, 2, 1, 1, 12}, {6, 2, 2, 1, 31}, {8, 2, 3, 0, 23}, {10, 2, 4, 0, 59}, {12, 2, 5, 0, 59}}};
+constexpr std::array<TField, 4> kIntervalFields{{{0, 8, 0, 0, 99999999}, {8, 2, 3, 0, 23}, {10, 2, 4, 0, 59}, {12, 2, 5, 0, 59}}};
+
+bool ReadDigits(std::string_view digits, std::int64_t& number) noexcept
+{
+    number = 0;
+    for (const char c : digits) {
+        if (c < '0' || c > '9') {
+            return false;
+        }
+        number = number * 10 + (c - '0');
+    }
+    return true;
+}
+
+bool ReadField(std::string_view text, const TField& field, std::int64_t& number, std::uint16_t& unknown) noexcept
+{
+    const std::string_view digits = text.substr(field.fStart, field.fLength);
+    if (digits.find_first_not_of('*') == std::string_view::npos) {
+        unknown = std::uint16_t(unknown | (1u << field.fBit));
+        number = field.fLeast;
+        return true;
+    }
+    return ReadDigits(digits, number) && number >= field.fLeast && number <= field.fGreatest;
+}
+
+bool ReadMicroseconds(std::string_view text, std::int64_t& number, std::uint16_t& unknown) noexcept
+{
+    number = 0;
+    for (unsigned int i = 0; i < 6; ++i) {
+        const char c = text[kMicroseconds + i];
+        if (c == '*') {
+            unknown = std::uint16_t(unknown | (1u << (kFirstMicrosecondBit + i)));
+        } else if (c < '0' || c > '9') {
+            return false;
+        }
+        number = number * 10 + (c == '*' ? 0 : c - '0');
+    }
+    return true;
+}
+
+bool IsLeapYear(std::int64_t year) noexcept
+{
+    return year % 4 == 0 && (year % 100 != 0 || year % 400 == 0);
+}
+
+std::int64_t GetDaysOfMonth(std::int64_t year, std::int64_t month) noexcept
+{
+    if (month == 2) {
+        return IsLeapYear(year) ? 29 : 28;
+    }
+    return month == 4 || month == 6 || month == 9 || month == 11 ? 30 : 31;
+}
+
+// Days since 1970-01-01 of a date of the Gregorian calendar, counted in years that begin in March and eras of 400 of them.
+std::int64_t GetDays(std::int64_t year, std::int64_t month, std::int64_t day) noexcept
+{
+    year -= month <= 2 ? 1 : 0;
+    const std::int64_t era = (year >= 0 ? year : year - 399) / 400;
+    const std::int64_t yearOfEra = year - era * 400;
+    const std::int64_t dayOfYear = (153 * (month + (month > 2 ? -3 : 9)) + 2) / 5 + day - 1;
+    return era * 146097 + yearOfEra * 365 + yearOfEra / 4 - yearOfEra / 100 + dayOfYear - 719468;
+}
+
+struct TDate {
+    std::int64_t fYear;
+    std::int64_t fMonth;
+    std::int64_t fDay;
+};
+
+TDate GetDate(std::int64_t days) noexcept
+{
+    days += 719468;
+    const std::int64_t era = (days >= 0 ? days : days - 146096) / 146097;
+    const std::int64_t dayOfEra = days - era * 146097;
+    const std::int64_t yearOfEra = (dayOfEra - dayOfEra / 1460 + dayOfEra / 36524 - dayOfEra / 146096) / 365;
+    const std::int64_t dayOfYear = dayOfEra - (365 * yearOfEra + yearOfEra / 4 - yearOfEra / 100);
+    const std::int64_t shifted = (5 * dayOfYear + 2) / 153;
+    const std::int64_t month = shifted + (shifted < 10 ? 3 : -9);
+    return {yearOfEra + era * 400 + (month <= 2 ? 1 : 0), month, dayOfYear - (153 * shifted + 2) / 5 + 1};
+}
+
+bool ReadInterval(std::string_view text, std::int64_t& microseconds, std::uint16_t& unknown) noexcept
+{
+    std::array<std::int64_t, kIntervalFields.size()> part{};
+    for (std::size_t i = 0; i < part.size(); ++i) {
+        if (!ReadField(text, kIntervalFields[i], part[i], unknown)) {
+            return false;
+        }
+    }
+    microseconds += part[0] * kDay + part[1] * kHour + part[2] * kMinute + part[3] * kSecond;
+    return text.substr(kSign + 1) == "000";
+}
+
+bool ReadTimestamp(std::string_view text, std::int64_t& microseconds, std::uint16_t& unknown, std::int16_t& offset) noexcept
+{
+    std::array<std::int64_t, kTimestampFields.size()> part{};
+    for (std::size_t i = 0; i < part.size(); ++i) {
+        if (!ReadField(text, kTimestampFields[i], part[i], unknown)) {
+            return false;
+        }
+    }
+    std::int64_t minutes = 0;
+    if (part[2] > GetDaysOfMonth(part[0], part[1]) || !ReadDigits(text.substr(kSign + 1), minutes)) {
+        return false;
+    }
+    offset = std::int16_t(text[kSign] == '-' ? -minutes : minutes);
+    microseconds +=
+        GetDays(part[0], part[1], part[2]) * kDay + part[3] * kHour + part[4] * kMinute + part[5] * kSecond - offset * kMinute;
+    return true;
+}
+
+void WriteDigits(char* to, std::size_t length, std::int64_t number) noexcept
+{
+    for (std::size_t i = length; i-- > 0; number /= 10) {
+        to[i] = char('0' + number % 10);
+    }
+}
+
+void WriteDate(char* to, std::int64_t days) noexcept
+{
+    const TDate date = GetDate(days);
+    WriteDigits(to, 4, date.fYear);
+    WriteDigits(to + 4, 2, date.fMonth);
+    WriteDigits(to + 6, 2, date.fDay);
+}
+
+template <class TFields>
+void WriteAsterisks(char* to, const TFields& fields, unsigned int unknown) noexcept
+{
+    for (const TField& field : fields) {
+        for (std::size_t i = 0; (unknown & (1u << field.fBit)) != 0 && i < field.fLength; ++i) {
+            to[field.fStart + i] = '*';
+        }
+    }
+    for (unsigned int i = 0; i < 6; ++i) {
+        if ((unknown & (1u << (kFirstMicrosecondBit + i))) != 0) {
+            to[kMicroseconds + i] = '*';
+        }
+    }
+}
+
+}  // namespace
+
+bool TCIMDateTime::Parse(std::string_view text, TCIMDateTime& result) noexcept
+{
+    if (text.size() != kLength || text[kPoint] != '.') {
+        return false;
+    }
+    TCIMDateTime parsed;
+    parsed.fInterval = text[kSign] == ':';
+    if (!parsed.fInterval && text[kSign] != '+' && text[kSign] != '-') {
+        return false;
+    }
+    const bool isRead = ReadMicroseconds(text, parsed.fMicroseconds, parsed.fUnknown) &&
+                        (parsed.fInterval ? ReadInterval(text, parsed.fMicroseconds, parsed.fUnknown)
+                                          : ReadTimestamp(text, parsed.fMicroseconds, parsed.fUnknown, parsed.fOffset));
+    if (isRead) {
+        result = parsed;
+    }
+    return isRead;
+}
+
+std::string TCIMDateTime::ToText() const
+{
+    const std::int64_t local = fMicroseconds + fOffset * kMinute;
+    std::int64_t days = local / kDay;
+    std::int64_t rest = local % kDay;
+    if (rest < 0) {
+        rest += kDay;
+        --days;
+    }
+    std::string text(kLength, '.');
+    WriteDigits(&text[8], 2, rest / kHour);
+    WriteDigits(&text[10], 2, rest % kHour / kMinute);
+    WriteDigits(&text[12], 2, rest % kMinute / kSecond);
+    WriteDigits(&text[kMicroseconds], 6, rest % kSecond);
+    WriteDigits(&text[kSign + 1], 3, std::abs(int(fOffset)));
+    if (fInterval) {
+        text[kSign] = ':';
+        WriteDigits(&text[0], 8, days);
+        WriteAsterisks(&text[0], kIntervalFields, fUnknown);
+    } else {
+        text[kSign] = fOffset < 0 ? '-' : '+';
+        WriteDate(&text[0], days);
+        WriteAsterisks(&text[0], kTimestampFields, fUnknown);
+    }
+    return text;
+}
+
+bool TCIMDateTime::operator==(const TCIMDateTime& other) const noexcept
+{
+    return fMicroseconds == other.fMicroseconds && fUnknown == other.fUnknown && fInterval == other.fInterval;
+}
+
+bool TCIMDateTime::operator<(const TCIMDateTime& other) const noexcept
+{
+    if (fInterval != other.fInterval) {
+        return other.fInterval;
+    }
+    return fMicroseconds != other.fMicroseconds ? fMicroseconds < other.fMicroseconds : fUnknown < other.fUnknown;
+}
+
+}  // namespace NORVZEL20

@@ -1,6 +1,7 @@
 #pragma once
 
 #include <string>
+#include <string_view>
 #include <vector>
 
 #include "host/ICIMQualifierDecl.h"
@@ -60,8 +61,8 @@ class TEmbeddedObject {
     const TProperty* FindProperty(std::string_view name) const noexcept;
 
     void SetSuperClassName(std::string name);
+    /// Nobody looks whether there is one of that name already; the first one is found.
     void AddQualifier(TQualifier qualifier);
-    /// One of the same name is replaced.
     void AddProperty(TProperty property);
     void AddMethod(TMethod method);
 

@@ -42,8 +42,6 @@ class TValueAccess {
     static TCIMValue FromBits(TCIMValue::TCIMType type, std::uint64_t bits) noexcept;
     static TCIMValue FromReal(TCIMValue::TCIMType type, double number) noexcept;
 
-    static TCIMDateTime MakeDateTime(std::int64_t microseconds, int offset, unsigned int unknown, bool interval) noexcept;
-
     /// The path of a value of form kPath, without a copy of it: valid while the value lives unchanged.
     static const TCIMReference& GetPath(const TCIMValue& value) noexcept;
 

@@ -29,6 +29,7 @@ class TCIMReference {
     ~TCIMReference();
 
     /// Adds one binding. A name that is bound already (in whatever letter case) gets the new value and keeps its place.
+    /// Errors: status 5 where references stand more than twelve deep in one another's bindings.
     void AddKeyValue(const std::string& name, const TCIMValue& value);
 
     /// Calls `callback` for each binding, as a (name, value) pair, in the order of GetPath, until it returns false.
