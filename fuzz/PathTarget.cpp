@@ -1,0 +1,73 @@
+#include "fuzz/Promise.h"
+#include "fuzz/SampleInventory.h"
+#include "fuzz/TFuzzTarget.h"
+#include "host/TCIMReference.h"
+#include "host/TZELException.h"
+
+namespace NORVZEL20 {
+
+namespace {
+
+/// Parses the text; false where it is no path.
+bool Parse(const std::string& text, const boost::shared_ptr<ICIMNamespace>& ns, TCIMReference& path)
+{
+    std::size_t position = std::string::npos;
+    try {
+        path = TCIMReference::Parse(text, ns, &position);
+        return true;
+    } catch (const TZELException& error) {
+        Promise(error.GetStatusCode().GetStatus() == TZELStatusCode::kParseError, "what is no path is refused with status 9");
+        Promise(position <= text.size(), "the position of an error lies in the text", std::to_string(position));
+        return false;
+    }
+}
+
+/// The path's text reads back as the same path.
+void CheckRoundTrip(const TCIMReference& path)
+{
+    const std::string text = path.GetPath();
+    TCIMReference again;
+    Promise(Parse(text, boost::shared_ptr<ICIMNamespace>(), again), "a path's own text is a path", text);
+    PromiseEqual(text, again.GetPath(), "a path's text is a fixed point");
+    PromiseEqual(path.GetNamespaceName(), again.GetNamespaceName(), "namespaces survive");
+    PromiseEqual(path.GetHost(), again.GetHost(), "hosts survive");
+    PromiseEqual(path.GetClassName(), again.GetClassName(), "classes survive");
+    path.EnumerateKeyBindings([&again](std::pair<std::string, TCIMValue> binding) {
+        const TCIMValue* found = again.FindKeyValue(binding.first);
+        Promise(found != nullptr && *found == binding.second, "bindings survive", binding.first);
+        return true;
+    });
+    Promise(path.GetKeyCount() == again.GetKeyCount(), "no binding is added");
+}
+
+/// A path of the sample finds what it names or is refused, whatever its keys are.
+void CheckLookUp(TInMemNamespace& ns, const TCIMReference& path)
+{
+    try {
+        ns.FindInstance(path);
+    } catch (const TZELException& error) {
+        const int status = error.GetStatusCode().GetStatus();
+        Promise(status == TZELStatusCode::kTypeMismatch || status == TZELStatusCode::kKeyMissing, "a look-up tells why it fails",
+                std::to_string(status));
+    }
+}
+
+}  // namespace
+
+void FuzzPath(std::string_view input)
+{
+    static const boost::shared_ptr<TInMemNamespace> fgSample = LoadSample();
+    const std::string text(input);
+    TCIMReference alone;
+    TCIMReference placed;
+    const bool isPath = Parse(text, boost::shared_ptr<ICIMNamespace>(), alone);
+    Promise(Parse(text, fgSample, placed) == isPath, "whether a text is a path does not depend on the namespace");
+    if (!isPath)
+        return;
+    CheckRoundTrip(alone);
+    CheckRoundTrip(placed);
+    CheckLookUp(*fgSample, alone);
+    CheckLookUp(*fgSample, placed);
+}
+
+}  // namespace NORVZEL20

@@ -1,0 +1,19 @@
+#pragma once
+
+#include <boost/smart_ptr/shared_ptr.hpp>
+#include <string>
+
+#include "embedded/TInMemNamespace.h"
+
+namespace NORVZEL20 {
+
+/// A small CIM-XML document with something of everything: types, arrays, keys, inheritance, an association, embedded objects.
+const std::string& GetSampleDocument();
+
+/// A new namespace that holds the sample document.
+boost::shared_ptr<TInMemNamespace> LoadSample();
+
+/// The namespace as one CIM-XML document.
+std::string WriteDocument(ICIMNamespace& ns);
+
+}  // namespace NORVZEL20

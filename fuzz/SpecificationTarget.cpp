@@ -1,0 +1,88 @@
+#include <algorithm>
+
+#include "fuzz/Promise.h"
+#include "fuzz/SampleInventory.h"
+#include "fuzz/TFuzzTarget.h"
+#include "fuzz/TLogRecorder.h"
+#include "spec/TDiffClassRules.h"
+#include "spec/TDiffXMLParser.h"
+
+namespace NORVZEL20 {
+
+namespace {
+
+struct TOutcome {
+    std::string rules;  ///< empty where the text was refused
+    std::vector<std::string> log;
+    int status = 0;
+};
+
+void CheckRules(ICIMNamespace& schema, const std::string& className, TCIMDiffEngine::TDiffClassRules& rules)
+{
+    Promise(schema.GetClass(className, TCallContext())->GetName(TCallContext()).size() == className.size(),
+            "rules are for classes of the schema");
+    Promise(rules.fDefault == TCIMDiffEngine::INCLUDE || rules.fDefault == TCIMDiffEngine::EXCLUDE, "a default is one of two");
+    for (const std::string& key : rules.fExcludedKeys) {
+        Promise(!key.empty() && key.find_first_of(" \t\r\n\v\f") == std::string::npos, "keys are separated by blanks");
+        Promise(rules.isKeyExcluded(key) && rules.hasExcludedKeys(), "an excluded key is known as one");
+    }
+}
+
+std::string Describe(ICIMNamespace& schema, TCIMDiffEngine::TRuleset ruleset)
+{
+    std::string text = "rules\n";
+    for (const auto& [className, rules] : ruleset.fRules) {
+        CheckRules(schema, className, *rules);
+        text += className + " " + TCIMDiffEngine::strPropType(rules->fDefault) + "\n";
+        for (const auto& [property, treatment] : rules->fProperties)
+            text += "  " + property + " " + TCIMDiffEngine::strPropType(treatment) + "\n";
+        for (const std::string& key : rules->fExcludedKeys)
+            text += "  without " + key + "\n";
+    }
+    return text;
+}
+
+TOutcome Read(const boost::shared_ptr<ICIMNamespace>& schema, std::string text)
+{
+    TOutcome outcome;
+    TLogRecorder log;
+    try {
+        TCIMDiffEngine::TDiffXMLParser parser(schema);
+        parser.Parse(text.data(), text.size());
+        outcome.rules = Describe(*schema, parser.getRuleset());
+    } catch (const TZELException& error) {
+        outcome.status = error.GetStatusCode().GetStatus();
+    }
+    outcome.log = log.GetMessages();
+    return outcome;
+}
+
+bool StartsWith(const std::string& text, const std::string& start)
+{
+    return text.compare(0, start.size(), start) == 0;
+}
+
+/// An error of the grammar is logged twice, that of the document itself once.
+void CheckRefusal(const TOutcome& outcome)
+{
+    Promise(outcome.status == TZELStatusCode::kParseError, "what is refused is refused with status 9");
+    Promise(outcome.log.size() == 1 || outcome.log.size() == 2, "a refusal is logged once or twice");
+    Promise(StartsWith(outcome.log[0], "Diff-XML Parser line "), "the first entry tells the line", outcome.log[0]);
+    Promise(outcome.log.size() == 1 || StartsWith(outcome.log[1], "TDiffXMLParser: Thr"), "the second entry tells the event",
+            outcome.log.back());
+}
+
+}  // namespace
+
+void FuzzSpecification(std::string_view input)
+{
+    static const boost::shared_ptr<ICIMNamespace> fgSchema = LoadSample();
+    const TOutcome outcome = Read(fgSchema, std::string(input));
+    if (outcome.rules.empty())
+        CheckRefusal(outcome);
+    else
+        Promise(outcome.log.empty(), "what is accepted is not logged");
+    PromiseEqual(outcome.rules, Read(fgSchema, std::string(input)).rules, "the same text gives the same rules");
+}
+
+}  // namespace NORVZEL20

@@ -1,0 +1,14 @@
+#include "fuzz/TFuzzTarget.h"
+
+namespace NORVZEL20 {
+
+const std::vector<TFuzzTarget>& TFuzzTarget::GetAll()
+{
+    static const std::vector<TFuzzTarget> fgTargets = {
+        {"inventory", FuzzInventory},         {"path", FuzzPath},   {"query", FuzzQuery},
+        {"specification", FuzzSpecification}, {"value", FuzzValue},
+    };
+    return fgTargets;
+}
+
+}  // namespace NORVZEL20

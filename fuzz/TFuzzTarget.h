@@ -1,0 +1,27 @@
+#pragma once
+
+#include <string_view>
+#include <vector>
+
+namespace NORVZEL20 {
+
+/// A function that takes any bytes, runs one part of the system over them and checks what that part promises.
+///
+/// Throws TBrokenPromise where a promise was broken; any other exception is a finding too. Equal bytes do the same again.
+struct TFuzzTarget {
+    const char* name;  ///< also that of its folders below corpus/ and found/ and of its dictionary
+    void (*run)(std::string_view input);
+
+    /// All targets, in the order of their names.
+    static const std::vector<TFuzzTarget>& GetAll();
+};
+
+void FuzzArguments(std::string_view input);      ///< a command line of the client, one argument a line
+void FuzzEngine(std::string_view input);         ///< bytes that namespaces and rules are made from
+void FuzzInventory(std::string_view input);      ///< a CIM-XML document
+void FuzzPath(std::string_view input);           ///< the text of an object path
+void FuzzQuery(std::string_view input);          ///< a whole query, or the condition of one
+void FuzzSpecification(std::string_view input);  ///< a specification file
+void FuzzValue(std::string_view input);          ///< the text of one value
+
+}  // namespace NORVZEL20

@@ -1,0 +1,90 @@
+#include "embedded/TValueText.h"
+#include "fuzz/Promise.h"
+#include "fuzz/TFuzzTarget.h"
+#include "host/TCIMDateTime.h"
+#include "host/TCIMReference.h"
+#include "host/TZELException.h"
+
+namespace NORVZEL20 {
+
+namespace {
+
+using TType = TCIMValue::TCIMType;
+
+bool IsNumber(TType type)
+{
+    return type >= TType::kUint8 && type <= TType::kReal64;
+}
+
+/// What is read writes itself as a text that reads back as the same value.
+void CheckText(TType type, const TCIMValue& value)
+{
+    Promise(value.GetType() == type && !value.IsNull(), "a value read has the type asked for");
+    Promise(value == value && value.Hash() == TCIMValue(value).Hash(), "a value equals itself");
+    std::string text;
+    TValueText::AppendPlain(text, value);
+    TCIMValue again;
+    Promise(TValueText::Parse(type, text, again), "a value's text can be read", text);
+    Promise(again == value && again.Hash() == value.Hash(), "a value's text reads as the value", text);
+    std::string second;
+    TValueText::AppendPlain(second, again);
+    PromiseEqual(text, second, "a value's text is a fixed point");
+    Promise(!value.ToText().empty() || type == TType::kString, "a value has a text for people");
+}
+
+/// A conversion loses nothing: numbers come back, whatever they were turned into on the way.
+void CheckConversions(const TCIMValue& value)
+{
+    for (unsigned char code = TType::kBoolean; code <= TType::kReference; ++code) {
+        const TType type(static_cast<TType::ECIMType>(code));
+        TCIMValue converted;
+        if (!TValueText::Convert(value, type, converted))
+            continue;
+        Promise(converted.GetType() == type, "a converted value has the type asked for");
+        TCIMValue back;
+        if (IsNumber(value.GetType()) && IsNumber(type) && TValueText::Convert(converted, value.GetType(), back))
+            Promise(back == value, "a conversion loses nothing", value.ToText() + " became " + back.ToText());
+    }
+}
+
+/// The text as the only key of a path reads back as it is.
+void CheckKeyText(const TCIMValue& value)
+{
+    TCIMReference path;
+    path.SetClassName("C");
+    path.AddKeyValue("K", value);
+    const TCIMReference again = TCIMReference::Parse(path.GetPath());
+    Promise(again.GetKeyCount() == 1, "one key stays one key", path.GetPath());
+    PromiseEqual(path.GetPath(), again.GetPath(), "a key's text is a fixed point");
+}
+
+void CheckDateTime(std::string_view text)
+{
+    TCIMDateTime value;
+    if (!TCIMDateTime::Parse(text, value))
+        return;
+    PromiseEqual(std::string(text), value.ToText(), "a datetime keeps its text");
+    Promise(value == value && !(value < value), "a datetime equals itself");
+    const TCIMDateTime epoch;
+    Promise((value < epoch) + (epoch < value) + (value == epoch) <= 1, "datetimes have an order");
+}
+
+}  // namespace
+
+void FuzzValue(std::string_view input)
+{
+    for (unsigned char code = TType::kBoolean; code <= TType::kDateTime; ++code) {
+        const TType type(static_cast<TType::ECIMType>(code));
+        TCIMValue value;
+        if (!TValueText::Parse(type, input, value)) {
+            Promise(value == TCIMValue() && value.GetType() == TType::kNone, "a text that is refused changes nothing");
+            continue;
+        }
+        CheckText(type, value);
+        CheckConversions(value);
+        CheckKeyText(value);
+    }
+    CheckDateTime(input);
+}
+
+}  // namespace NORVZEL20

@@ -1,0 +1,86 @@
+// Documents that expand to far more than they are: entities within entities, long entities often used, entities without end.
+#include "tests/hostile/HostileRow.h"
+#include "tests/hostile/TMemoryMeter.h"
+
+namespace NORVZEL20 {
+
+namespace {
+
+constexpr std::size_t kMegabyte = 1u << 20;
+
+std::string Repeat(const std::string& unit, std::size_t times)
+{
+    std::string text;
+    text.reserve(unit.size() * times);
+    for (std::size_t i = 0; i < times; ++i)
+        text += unit;
+    return text;
+}
+
+/// Ten entities, each of ten of the one before: ten thousand million letters.
+THostileDocument BillionLaughs(const std::string& content)
+{
+    std::string prolog = "<!DOCTYPE r [<!ENTITY e0 \"0123456789\">";
+    for (int level = 1; level < 10; ++level)
+        prolog += "<!ENTITY e" + std::to_string(level) + " \"" + Repeat("&e" + std::to_string(level - 1) + ";", 10) + "\">";
+    return {prolog + "]>", content};
+}
+
+/// One long entity, used often.
+THostileDocument QuadraticBlowUp()
+{
+    return {"<!DOCTYPE r [<!ENTITY e \"" + std::string(kMegabyte / 4, 'x') + "\">]>", Repeat("&e;", 1000)};
+}
+
+/// Parameter entities expand within the declarations.
+THostileDocument ParameterBomb()
+{
+    std::string prolog = "<!DOCTYPE r [<!ENTITY % p0 \"<!-- 0123456789 -->\">";
+    for (int level = 1; level < 10; ++level)
+        prolog += "<!ENTITY % p" + std::to_string(level) + " \"" + Repeat("&#37;p" + std::to_string(level - 1) + ";", 10) + "\">";
+    return {prolog + "%p9;]>", "Id"};
+}
+
+THostileDocument ManyEntities()
+{
+    std::string prolog = "<!DOCTYPE r [";
+    for (int i = 0; i < 1001; ++i)
+        prolog += "<!ENTITY e" + std::to_string(i) + " \"v\">";
+    return {prolog + "]>", "Id"};
+}
+
+}  // namespace
+
+TEST(EntityTest, BombsAreRefused)
+{
+    const std::string reason = "limit on input amplification factor (from DTD and entities) breached";
+    ExpectOutcomes({
+        Refused("billion laughs in text", BillionLaughs("&e9;"), 1, reason, "1:0"),
+        Refused("one long entity a thousand times", QuadraticBlowUp(), 1, reason, "1:0"),
+        Refused("parameter entities", ParameterBomb(), 1, reason, "1:0"),
+        Refused("an entity of itself", {"<!DOCTYPE r [<!ENTITY e \"&f;\"><!ENTITY f \"&e;\">]>", "&e;"}, 1,
+                "recursive entity reference", "1:0"),
+        Refused("too many declarations", ManyEntities(), 1, "too many entity declarations", "1:0"),
+        Refused("an entity that nobody declared", {"", "&nobody;"}, 1, "undefined entity", "1:0"),
+    });
+}
+
+TEST(EntityTest, BombsTakeLittleMemory)
+{
+    for (const THostileDocument& document : {BillionLaughs("&e9;"), QuadraticBlowUp(), ParameterBomb()}) {
+        TMemoryMeter meter;
+        document.ReadByParser();
+        EXPECT_LT(meter.GetPeak(), 32 * kMegabyte);
+        EXPECT_LT(meter.GetTotal(), 100 * kMegabyte);
+    }
+}
+
+/// What an honest writer uses stays usable.
+TEST(EntityTest, ModestEntitiesAreReplaced)
+{
+    ExpectOutcomes(
+        {{"an entity", {"<!DOCTYPE r [<!ENTITY i \"I&#100;\">]>", "&i;"}, "1 elements, text 'Id'", "loaded 'Id'", "rules for 'Id'"},
+         {"character references", {"", "&#73;&#x64;"}, "1 elements, text 'Id'", "loaded 'Id'", "rules for 'Id'"}});
+}
+
+}  // namespace NORVZEL20

@@ -1,0 +1,101 @@
+#include "tests/hostile/THostileDocument.h"
+
+#include <map>
+
+#include "embedded/TCimXmlPopulator.h"
+#include "fuzz/SampleInventory.h"
+#include "fuzz/TLogRecorder.h"
+#include "host/TXmlParser.h"
+#include "spec/TDiffClassRules.h"
+#include "spec/TDiffXMLParser.h"
+
+namespace NORVZEL20 {
+
+namespace {
+
+/// Counts elements and keeps the text; remembers the first reason and complains of a second one.
+class TPlainParser : public TXmlParser {
+  public:
+    void StartElement(const char*, std::map<std::string, std::string>&) override { ++fElements; }
+    void characters(const char* text, unsigned int length) override { fText.append(text, length); }
+    void FatalError(const char* message) override
+    {
+        if (!fReason.empty())
+            fReason += " AND AGAIN ";
+        fReason += "line " + std::to_string(GetCurLine()) + ": " + message;
+    }
+    std::string Tell() const { return fReason.empty() ? std::to_string(fElements) + " elements, text '" + fText + "'" : fReason; }
+
+  private:
+    std::size_t fElements = 0;
+    std::string fText;
+    std::string fReason;
+};
+
+std::string TellRules(const TCIMDiffEngine::TRuleset& ruleset)
+{
+    std::string told = "rules for";
+    for (const auto& rules : ruleset.fRules) {
+        for (const auto& property : rules.second->fProperties)
+            told += " '" + property.first + "'";
+    }
+    return told;
+}
+
+std::string TellRefusal(const TZELException& error, const TLogRecorder& log)
+{
+    std::string told = "status " + std::to_string(error.GetStatusCode().GetStatus());
+    for (const std::string& message : log.GetMessages())
+        told += "\n" + message;
+    return told;
+}
+
+}  // namespace
+
+std::string THostileDocument::Encoded(const std::string& beginning, const std::string& end) const
+{
+    const std::string whole = prolog + beginning + content + end;
+    return encode == nullptr ? whole : encode(whole);
+}
+
+std::string THostileDocument::ReadByParser() const
+{
+    std::string text = Encoded("<r>", "</r>");
+    TPlainParser parser;
+    parser.Parse(text.data(), text.size());
+    return parser.Tell();
+}
+
+std::string THostileDocument::LoadByPopulator() const
+{
+    const std::string text = Encoded("<CIM CIMVERSION=\"2.0\" DTDVERSION=\"2.0\"><DECLARATION><DECLGROUP><VALUE.OBJECT>"
+                                     "<INSTANCE CLASSNAME=\"Device\"><PROPERTY NAME=\"Id\" TYPE=\"string\"><VALUE>",
+                                     "</VALUE></PROPERTY></INSTANCE></VALUE.OBJECT></DECLGROUP></DECLARATION></CIM>");
+    const boost::shared_ptr<TInMemNamespace> ns = LoadSample();
+    TCimXmlPopulator populator(ns);
+    populator.KeepElements();
+    try {
+        populator.LoadFromMemory(text.data(), text.size(), "hostile.xml");
+    } catch (const TPopulateError& error) {
+        return error.what();
+    }
+    const auto instance = boost::dynamic_pointer_cast<ICIMInstance>(populator.TakeElements().at(0));
+    return "loaded '" + instance->GetProperty("Id", TCallContext())->GetValue(TCallContext()).ToText() + "'";
+}
+
+std::string THostileDocument::ReadAsSpecification() const
+{
+    std::string text =
+        Encoded("<DifftoolSpec><class name=\"Device\"><includelist><value>", "</value></includelist></class></DifftoolSpec>");
+    const boost::shared_ptr<ICIMNamespace> schema = LoadSample();
+    TLogRecorder log;
+    try {
+        TCIMDiffEngine::TDiffXMLParser parser(schema);
+        parser.Parse(text.data(), text.size());
+        return TellRules(parser.getRuleset());
+    } catch (const TZELException& error) {
+        return TellRefusal(error, log);
+    }
+}
+
+}  // namespace NORVZEL20

@@ -1,0 +1,121 @@
+#include "tests/hostile/TMemoryMeter.h"
+
+#include <malloc.h>
+
+#include <atomic>
+
+#if defined(__has_feature)
+#if __has_feature(address_sanitizer) || __has_feature(thread_sanitizer)
+#define CIMDELTA_SANITIZED
+#endif
+#endif
+#if defined(__SANITIZE_ADDRESS__) || defined(__SANITIZE_THREAD__)
+#define CIMDELTA_SANITIZED
+#endif
+
+namespace NORVZEL20 {
+
+namespace {
+
+std::atomic<std::size_t> inUse{0};
+std::atomic<std::size_t> peak{0};
+std::atomic<std::size_t> total{0};
+
+void Gain(std::size_t size)
+{
+    total += size;
+    const std::size_t now = inUse += size;
+    std::size_t most = peak;
+    while (most < now && !peak.compare_exchange_weak(most, now)) {
+    }
+}
+
+void Lose(std::size_t size)
+{
+    inUse -= size;
+}
+
+}  // namespace
+
+TMemoryMeter::TMemoryMeter() : fInUseAtStart(inUse), fTotalAtStart(total)
+{
+    peak = fInUseAtStart;
+}
+
+std::size_t TMemoryMeter::GetPeak() const
+{
+    return peak - fInUseAtStart;
+}
+
+std::size_t TMemoryMeter::GetTotal() const
+{
+    return total - fTotalAtStart;
+}
+
+}  // namespace NORVZEL20
+
+#ifdef CIMDELTA_SANITIZED
+
+extern "C" int __sanitizer_install_malloc_and_free_hooks(void (*onMalloc)(const volatile void*, std::size_t),
+                                                         void (*onFree)(const volatile void*));
+extern "C" std::size_t __sanitizer_get_allocated_size(const volatile void* block);
+
+namespace {
+
+void OnMalloc(const volatile void*, std::size_t size)
+{
+    NORVZEL20::Gain(size);
+}
+
+void OnFree(const volatile void* block)
+{
+    if (block != nullptr)
+        NORVZEL20::Lose(__sanitizer_get_allocated_size(block));
+}
+
+const int hooksInstalled = __sanitizer_install_malloc_and_free_hooks(OnMalloc, OnFree);
+
+}  // namespace
+
+#else
+
+extern "C" {
+
+void* __libc_malloc(std::size_t size);
+void* __libc_calloc(std::size_t count, std::size_t size);
+void* __libc_realloc(void* block, std::size_t size);
+void __libc_free(void* block);
+
+void* malloc(std::size_t size)
+{
+    void* block = __libc_malloc(size);
+    NORVZEL20::Gain(malloc_usable_size(block));
+    return block;
+}
+
+void* calloc(std::size_t count, std::size_t size)
+{
+    void* block = __libc_calloc(count, size);
+    NORVZEL20::Gain(malloc_usable_size(block));
+    return block;
+}
+
+void* realloc(void* block, std::size_t size)
+{
+    const std::size_t before = malloc_usable_size(block);
+    void* moved = __libc_realloc(block, size);
+    if (moved != nullptr || size == 0) {
+        NORVZEL20::Lose(before);
+        NORVZEL20::Gain(malloc_usable_size(moved));
+    }
+    return moved;
+}
+
+void free(void* block)
+{
+    NORVZEL20::Lose(malloc_usable_size(block));
+    __libc_free(block);
+}
+}
+
+#endif

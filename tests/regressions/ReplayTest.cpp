@@ -1,0 +1,103 @@
+// Replays every input of the fuzzers: those written by hand, and those that once broke something.
+#include <gtest/gtest.h>
+
+#include <algorithm>
+#include <filesystem>
+#include <fstream>
+#include <iterator>
+#include <string>
+#include <vector>
+
+#include "fuzz/TFuzzTarget.h"
+
+namespace NORVZEL20 {
+
+namespace {
+
+using TFolder = std::filesystem::path;
+
+const TFolder kFuzzFolder = CIMDELTA_FUZZ_FOLDER;
+
+std::vector<TFolder> FilesIn(const TFolder& folder)
+{
+    std::vector<TFolder> files;
+    for (const auto& entry : std::filesystem::directory_iterator(folder))
+        files.push_back(entry.path());
+    std::sort(files.begin(), files.end());
+    return files;
+}
+
+std::string ContentOf(const TFolder& file)
+{
+    std::ifstream stream(file, std::ios::binary);
+    EXPECT_TRUE(stream.good()) << file;
+    return std::string(std::istreambuf_iterator<char>(stream), std::istreambuf_iterator<char>());
+}
+
+/// What happened: "held", or the promise that was broken.
+std::string Replay(const TFuzzTarget& target, const std::string& input)
+{
+    try {
+        target.run(input);
+        return "held";
+    } catch (const std::exception& error) {
+        return error.what();
+    }
+}
+
+std::string NameOf(const testing::TestParamInfo<TFuzzTarget>& tested)
+{
+    return tested.param.name;
+}
+
+class ReplayTest : public testing::TestWithParam<TFuzzTarget> {
+  protected:
+    std::size_t ReplayAll(const std::string& kind)
+    {
+        const TFolder folder = kFuzzFolder / kind / GetParam().name;
+        if (!std::filesystem::exists(folder))
+            return 0;
+        const std::vector<TFolder> files = FilesIn(folder);
+        for (const TFolder& file : files)
+            EXPECT_EQ("held", Replay(GetParam(), ContentOf(file))) << file;
+        return files.size();
+    }
+};
+
+}  // namespace
+
+TEST_P(ReplayTest, SeedsKeepEveryPromise)
+{
+    EXPECT_GT(ReplayAll("corpus"), 0U) << "no seeds in " << kFuzzFolder / "corpus" / GetParam().name;
+}
+
+TEST_P(ReplayTest, FindingsKeepEveryPromise)
+{
+    ReplayAll("found");
+}
+
+/// An empty and a short input of each byte: what a fuzzer tries first.
+TEST_P(ReplayTest, SingleBytesKeepEveryPromise)
+{
+    EXPECT_EQ("held", Replay(GetParam(), std::string()));
+    for (int byte = 0; byte < 256; ++byte)
+        EXPECT_EQ("held", Replay(GetParam(), std::string(1, static_cast<char>(byte)))) << byte;
+}
+
+INSTANTIATE_TEST_SUITE_P(Targets, ReplayTest, testing::ValuesIn(TFuzzTarget::GetAll()), NameOf);
+
+/// Every folder of findings belongs to a target, so that none is left out, and the folder itself is there.
+TEST(FindingsTest, EveryFindingIsReplayed)
+{
+    std::size_t findings = 0;
+    for (const TFolder& folder : FilesIn(kFuzzFolder / "found")) {
+        const auto& targets = TFuzzTarget::GetAll();
+        const bool known = std::any_of(targets.begin(), targets.end(),
+                                       [&folder](const TFuzzTarget& target) { return folder.filename() == target.name; });
+        EXPECT_TRUE(known || folder.filename() == "README.md") << folder;
+        findings += known ? FilesIn(folder).size() : 0;
+    }
+    RecordProperty("findings", static_cast<int>(findings));
+}
+
+}  // namespace NORVZEL20
