@@ -46,6 +46,9 @@ class TCimXmlPopulator {
     std::vector<boost::shared_ptr<ICIMElement>> TakeElements();
 
   private:
+    template <class TRead>
+    TLoadReport Load(const std::string& name, TRead read);
+
     boost::shared_ptr<ICIMNamespace> fNamespace;
     bool fKeep = false;
     std::vector<boost::shared_ptr<ICIMElement>> fElements;

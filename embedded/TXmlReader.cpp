@@ -132,9 +132,9 @@ void TXmlReader::Install()
     XML_SetBillionLaughsAttackProtectionActivationThreshold(parser, kExpansionThreshold);
 }
 
-void TXmlReader::Reset()
+void TXmlReader::Reset(const char* encoding)
 {
-    XML_ParserReset(fParser.get(), nullptr);
+    XML_ParserReset(fParser.get(), encoding);
     Install();
     fText.clear();
     fDepth = fEntities = fBytes = 0;

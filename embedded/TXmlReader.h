@@ -46,8 +46,8 @@ class TXmlReader {
     TXmlReader& operator=(const TXmlReader&) = delete;
     ~TXmlReader();
 
-    /// Makes the reader ready for a new document.
-    void Reset();
+    /// Makes the reader ready for a new document; `encoding` (may be null) overrides what the document says of its own.
+    void Reset(const char* encoding = nullptr);
 
     /// Parses the next `length` bytes; `last` ends the document too, at less cost than a call of Finish. Returns false where the
     /// document is in error; see GetError. Errors: what the sink throws.

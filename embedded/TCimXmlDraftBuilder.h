@@ -1,0 +1,47 @@
+#pragma once
+
+#include <optional>
+#include <string>
+
+#include "embedded/TCimXmlAttributes.h"
+#include "embedded/TCimXmlContext.h"
+#include "embedded/TCimXmlDraft.h"
+
+namespace NORVZEL20 {
+
+/// Puts a class or an instance together while its elements are read.
+///
+/// Errors: every operation fails through the context.
+class TCimXmlDraftBuilder {
+  public:
+    explicit TCimXmlDraftBuilder(TCimXmlContext& context) : fContext(context) {}
+
+    void BeginClass(const char* name, const char* superClass);
+    void BeginInstance(const char* className);
+    bool IsOpen() const noexcept { return fDraft.has_value(); }
+    TCimXmlDraft Take();
+
+    void BeginProperty(const char* name, const TCimXmlAttributes& attributes);
+    void EndProperty(TCIMValue value);
+    void BeginMethod(const char* name, TCIMValue::TCIMType type, const TCimXmlAttributes& attributes);
+    void EndMethod();
+    void BeginParameter(const char* name, TCIMValue::TCIMType type, const TCimXmlAttributes& attributes);
+    void EndParameter();
+    /// Puts it on the innermost element that is open.
+    void AddQualifier(TEmbeddedObject::TQualifier qualifier);
+
+    /// The attributes OVERRIDABLE, TOSUBCLASS, TOINSTANCE and TRANSLATABLE with their defaults.
+    static ICIMQualifierDecl::EFlavor ReadFlavor(const TCimXmlAttributes& attributes);
+
+  private:
+    unsigned int ReadArraySize(const TCimXmlAttributes& attributes) const;
+
+    TCimXmlContext& fContext;
+    std::optional<TCimXmlDraft> fDraft;
+    std::optional<TEmbeddedObject::TProperty> fProperty;
+    TCimXmlContext::TPlace fPropertyPlace;
+    std::optional<TEmbeddedObject::TMethod> fMethod;
+    std::optional<TEmbeddedObject::TParameter> fParameter;
+};
+
+}  // namespace NORVZEL20

@@ -1,0 +1,80 @@
+#pragma once
+
+#include <cstddef>
+
+namespace NORVZEL20 {
+
+/// The elements of CIM-XML (DSP0203) that a loader meets.
+class TCimXmlElement {
+  public:
+    enum EElement : unsigned char {
+        kUnknown = 0,
+        kCim,
+        kClass,
+        kClassName,
+        kClassPath,
+        kCorrelator,
+        kDeclaration,
+        kDeclGroup,
+        kDeclGroupWithName,
+        kDeclGroupWithPath,
+        kError,
+        kHost,
+        kIMethodCall,
+        kIMethodResponse,
+        kInstance,
+        kInstanceName,
+        kInstancePath,
+        kIParamValue,
+        kIReturnValue,
+        kKeyBinding,
+        kKeyValue,
+        kLocalClassPath,
+        kLocalInstancePath,
+        kLocalNamespacePath,
+        kMessage,
+        kMethod,
+        kMethodCall,
+        kMethodResponse,
+        kMultiReq,
+        kMultiRsp,
+        kNamespace,
+        kNamespacePath,
+        kObjectPath,
+        kParameter,
+        kParameterArray,
+        kParameterRefArray,
+        kParameterReference,
+        kParamValue,
+        kProperty,
+        kPropertyArray,
+        kPropertyReference,
+        kQualifier,
+        kQualifierDeclaration,
+        kReturnValue,
+        kScope,
+        kSimpleReq,
+        kSimpleRsp,
+        kValue,
+        kValueArray,
+        kValueInstanceWithPath,
+        kValueNamedInstance,
+        kValueNamedObject,
+        kValueNull,
+        kValueObject,
+        kValueObjectWithLocalPath,
+        kValueObjectWithPath,
+        kValueRefArray,
+        kValueReference,
+        kCount  ///< not an element: how many there are
+    };
+
+    TCimXmlElement() = delete;
+
+    /// The element of that name, byte for byte; kUnknown where there is none.
+    static EElement Find(const char* name) noexcept;
+    /// Its name as documents write it; "" for kUnknown.
+    static const char* GetName(EElement element) noexcept;
+};
+
+}  // namespace NORVZEL20

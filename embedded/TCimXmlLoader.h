@@ -1,0 +1,105 @@
+#pragma once
+
+#include <boost/smart_ptr/shared_ptr.hpp>
+#include <cstdint>
+#include <memory>
+#include <string>
+#include <string_view>
+#include <utility>
+#include <vector>
+
+#include "embedded/TCimXmlContext.h"
+#include "embedded/TCimXmlDraft.h"
+#include "embedded/TInMemNamespace.h"
+#include "embedded/TInMemStaging.h"
+#include "embedded/TNameText.h"
+#include "host/ICIMElement.h"
+
+namespace NORVZEL20 {
+
+/// Makes what a document tells part of a namespace: all of it, or nothing.
+///
+/// Classes wait until they are needed or the document ends, so that they may come in any order. An instance is filled directly,
+/// property by property, where its class is known; otherwise it waits as a draft until the document ends, and so do those after it.
+/// Errors: every operation but Commit fails through the context.
+class TCimXmlLoader {
+  public:
+    using TOwnKeys = std::vector<std::pair<std::string, TCIMValue>>;
+
+    /// A property of the instance being filled.
+    struct TTarget {
+        std::uint32_t slot;
+        TCIMValue::TCIMType type;
+        bool isEmbedded;  ///< whether text is an embedded object
+    };
+
+    TCimXmlLoader(TCimXmlContext& context, boost::shared_ptr<TInMemNamespace> ns);
+
+    void AddQualifierDecl(const TCimXmlQualifierDraft& draft);
+    void AddClass(TCimXmlDraft draft);
+
+    /// False where the instance has to be read as a draft.
+    bool BeginInstance(const char* className);
+    TTarget FindProperty(std::string_view name);
+    /// `metUnknownClass` tells that the value refers to a class that is not known yet.
+    void SetProperty(const TTarget& target, TCIMValue value, bool metUnknownClass);
+    /// `ownKeys` (may be null) fills the keys that the instance itself does not tell.
+    void EndInstance(const TOwnKeys* ownKeys);
+    void AddInstance(TCimXmlDraft draft);
+
+    /// The document has ended: adds what waits.
+    void Finish();
+    void Commit() noexcept { fStaging.Commit(); }
+
+    void KeepElements() { fKeep = true; }
+    /// Classes, then instances, each in the document's order; empty without KeepElements.
+    std::vector<boost::shared_ptr<ICIMElement>> TakeElements();
+
+  private:
+    struct TClassDraft {
+        enum EState { kWaiting, kVisited, kDeclared };
+
+        TCimXmlDraft draft;
+        EState state;
+    };
+
+    /// What is known of a class whose instances are read; vectors go by slot.
+    struct TLayout {
+        boost::shared_ptr<TInMemClass> cls;
+        std::vector<bool> embedded;            // see TTarget
+        std::vector<std::uint32_t> positions;  // in order of declaration
+        std::vector<std::uint32_t> given;      // the number of the last instance that told it
+    };
+
+    void DeclareClasses();
+    void DeclareClass(std::size_t number);
+    [[noreturn]] void RefuseClass(const TCimXmlDraft& draft) const;
+    TLayout* FindLayout(const char* className);
+    TLayout* AddLayout(const char* className, const boost::shared_ptr<TInMemClass>& cls);
+    void BeginInstance(TLayout& layout);
+    TCIMValue Convert(const TTarget& target, const TCIMValue& value);
+    void FillKeys(const TOwnKeys& keys);
+    [[noreturn]] void Explain(const TZELException& error) const;
+    void AddWaiting(const TCimXmlDraft& draft);
+    void ResolveReferences();
+
+    TCimXmlContext& fContext;
+    boost::shared_ptr<TInMemNamespace> fNamespace;
+    TInMemStaging fStaging;
+    std::vector<TClassDraft> fClasses;
+    TNameMap<std::size_t> fClassNumbers;
+    std::vector<TCimXmlDraft> fWaiting;           // instances
+    TNameMap<std::unique_ptr<TLayout>> fLayouts;  // by class name
+    TLayout* fLayout = nullptr;                   // of the instance being filled, or the last one
+    boost::shared_ptr<TInMemInstance> fInstance;
+    std::uint32_t fNumber = 0;  // of the instance
+    std::size_t fExpected = 0;  // the position of the property that is likely to come next
+    std::vector<std::pair<boost::shared_ptr<TInMemInstance>, std::uint32_t>> fUnresolved;
+    bool fNewClasses = false;    // some have not been tried yet
+    bool fDeferring = false;     // instances wait
+    bool fDeclaredLate = false;  // a class was declared after the first instance
+    bool fKeep = false;
+    std::vector<boost::shared_ptr<ICIMElement>> fKeptInstances;
+};
+
+}  // namespace NORVZEL20

@@ -1,0 +1,156 @@
+#include "embedded/TCimXmlPopulator.h"
+
+#include <algorithm>
+#include <boost/ref.hpp>
+#include <cerrno>
+#include <cstdio>
+#include <cstring>
+#include <memory>
+#include <utility>
+
+#include "embedded/TCimXmlContext.h"
+#include "embedded/TCimXmlLoader.h"
+#include "embedded/TCimXmlReader.h"
+#include "embedded/TInMemNamespace.h"
+#include "embedded/TXmlReader.h"
+
+namespace NORVZEL20 {
+
+namespace {
+
+using EStatus = TZELStatusCode::EStatusCode;
+
+constexpr std::size_t kPiece = 256 * 1024;
+
+struct TFileCloser {
+    void operator()(std::FILE* file) const noexcept { std::fclose(file); }
+};
+
+/// Delivers a file piece by piece.
+class TFileSource {
+  public:
+    explicit TFileSource(const std::string& path) : fPath(path), fFile(std::fopen(path.c_str(), "rb"))
+    {
+        if (!fFile)
+            Fail("cannot open the file: ");
+    }
+
+    std::size_t operator()(char* buffer, std::size_t size)
+    {
+        const std::size_t length = std::fread(buffer, 1, size, fFile.get());
+        if (length == 0 && std::ferror(fFile.get()) != 0)
+            Fail("cannot read the file: ");
+        return length;
+    }
+
+  private:
+    [[noreturn]] void Fail(const char* what) const
+    {
+        throw TPopulateError(EStatus::kFileError, std::string(what) + std::strerror(errno), fPath, 0, 0);
+    }
+
+    std::string fPath;
+    std::unique_ptr<std::FILE, TFileCloser> fFile;
+};
+
+/// One load, from its first byte to its end.
+class TLoad {
+  public:
+    TLoad(const boost::shared_ptr<TInMemNamespace>& ns, const std::string& name)
+        : fContext(name), fLoader(fContext, ns), fReader(fContext, ns, &fLoader), fXml(fReader)
+    {
+        fContext.SetReader(fXml);
+    }
+
+    void ReadMemory(const char* data, std::size_t length)
+    {
+        RefuseEmpty(length);
+        Check(fXml.Parse(data, length, true));
+    }
+
+    void ReadSource(const TCimXmlPopulator::TPullSource& source)
+    {
+        std::size_t total = 0;
+        for (;;) {
+            // A tag that goes on and on is read again with each piece: growing pieces keep that in proportion.
+            const std::size_t room = std::max(kPiece, fXml.GetPending());
+            const std::size_t length = source(fXml.GetBuffer(room), room);
+            if (length == 0)
+                break;
+            total += length;
+            Check(fXml.ParseBuffer(length));
+        }
+        RefuseEmpty(total);
+        Check(fXml.Finish());
+    }
+
+    TCimXmlLoader& GetLoader() noexcept { return fLoader; }
+
+    TLoadReport Finish()
+    {
+        fLoader.Finish();
+        fLoader.Commit();
+        return std::move(fContext.GetReport());
+    }
+
+  private:
+    void RefuseEmpty(std::size_t length) const
+    {
+        if (length == 0)
+            fContext.Fail(EStatus::kParseError, "found an empty document, expected CIM-XML");
+    }
+
+    void Check(bool succeeded) const
+    {
+        if (!succeeded)
+            fContext.Fail(EStatus::kParseError, "found malformed XML: " + fXml.GetError());
+    }
+
+    TCimXmlContext fContext;
+    TCimXmlLoader fLoader;
+    TCimXmlReader fReader;
+    TXmlReader fXml;
+};
+
+}  // namespace
+
+TCimXmlPopulator::TCimXmlPopulator(boost::shared_ptr<ICIMNamespace> ns) : fNamespace(std::move(ns)) {}
+
+template <class TRead>
+TLoadReport TCimXmlPopulator::Load(const std::string& name, TRead read)
+{
+    const auto ns = boost::dynamic_pointer_cast<TInMemNamespace>(fNamespace);
+    if (!ns)
+        throw TPopulateError(EStatus::kNotSupported, "the namespace is none of the provider \"inmem\", load into one of those",
+                             name, 0, 0);
+    TLoad load(ns, name);
+    if (fKeep)
+        load.GetLoader().KeepElements();
+    read(load);
+    TLoadReport report = load.Finish();
+    fElements = load.GetLoader().TakeElements();
+    return report;
+}
+
+TLoadReport TCimXmlPopulator::LoadFromMemory(const char* data, std::size_t length, const std::string& name)
+{
+    return Load(name, [&](TLoad& load) { load.ReadMemory(data, length); });
+}
+
+TLoadReport TCimXmlPopulator::LoadFromSource(const TPullSource& source, const std::string& name)
+{
+    return Load(name, [&](TLoad& load) { load.ReadSource(source); });
+}
+
+TLoadReport TCimXmlPopulator::LoadFile(const std::string& path)
+{
+    TFileSource file(path);
+    return LoadFromSource(boost::ref(file), path);
+}
+
+std::vector<boost::shared_ptr<ICIMElement>> TCimXmlPopulator::TakeElements()
+{
+    return std::exchange(fElements, {});
+}
+
+}  // namespace NORVZEL20

@@ -1,0 +1,472 @@
+#include "embedded/TCimXmlReader.h"
+
+#include <boost/smart_ptr/make_shared.hpp>
+#include <utility>
+
+#include "embedded/TValueText.h"
+
+namespace NORVZEL20 {
+
+using EStatus = TZELStatusCode::EStatusCode;
+using TType = TCIMValue::TCIMType;
+
+namespace {
+
+constexpr std::size_t kMaxEmbeddedDepth = 32;
+
+std::string Quote(std::string_view text)
+{
+    return TCimXmlContext::Quote(text);
+}
+
+bool IsMarkedEmbedded(const TCimXmlAttributes& attributes)
+{
+    return attributes.Find("EmbeddedObject") != nullptr || attributes.Find("EMBEDDEDOBJECT") != nullptr;
+}
+
+}  // namespace
+
+/// Reads the text of embedded objects; kept between them, because a parser is dear to make.
+class TCimXmlReader::TEmbedded {
+  public:
+    TEmbedded(TCimXmlContext& context, const boost::shared_ptr<TInMemNamespace>& ns)
+        : fContext(context), fSink(context, ns, nullptr), fXml(fSink)
+    {}
+
+    boost::shared_ptr<const TEmbeddedObject> Read(std::string_view text)
+    {
+        fSink.Reset();
+        fXml.Reset("UTF-8");
+        if (!fXml.Parse(text.data(), text.size(), true))
+            fContext.Fail(EStatus::kTypeMismatch,
+                          "found " + Quote(text) + ", expected an <INSTANCE> or a <CLASS> (" + fXml.GetError() + ")");
+        return fSink.TakeObject();
+    }
+
+  private:
+    TCimXmlContext& fContext;
+    TCimXmlReader fSink;
+    TXmlReader fXml;
+};
+
+TCimXmlReader::TCimXmlReader(TCimXmlContext& context, boost::shared_ptr<TInMemNamespace> ns, TCimXmlLoader* loader)
+    : fContext(context), fNamespace(ns), fLoader(loader), fPaths(context, std::move(ns)), fDraft(context)
+{
+    Reset();
+}
+
+TCimXmlReader::~TCimXmlReader() = default;
+
+void TCimXmlReader::Reset()
+{
+    fOpen.assign(1, {fLoader != nullptr ? TTable::kStart : TTable::kEmbedded, TElement::kUnknown});
+    fText = std::string_view();
+    fObject.reset();
+}
+
+boost::shared_ptr<const TEmbeddedObject> TCimXmlReader::TakeObject()
+{
+    return std::exchange(fObject, boost::shared_ptr<const TEmbeddedObject>());
+}
+
+void TCimXmlReader::OnStart(const char* name, const char** attributes)
+{
+    CheckBlank();
+    const TElement::EElement element = TElement::Find(name);
+    const TTable::TStep step = TTable::Find(GetState(), element);
+    if (step.action == TTable::kRefuse)
+        FailUnexpected(name);
+    fOpen.push_back({step.next, element});
+    fText = std::string_view();
+    Begin(step.action, TCimXmlAttributes(attributes));
+}
+
+void TCimXmlReader::OnEnd(const char*)
+{
+    CheckBlank();
+    const TTable::EAction action = TTable::GetEndAction(GetState());
+    fOpen.pop_back();
+    End(action);
+    fText = std::string_view();
+}
+
+void TCimXmlReader::FailUnexpected(const char* name) const
+{
+    const TOpen& open = fOpen.back();
+    const std::string place = open.element == TElement::kUnknown ? " as the outermost element"
+                                                                 : std::string(" in <") + TElement::GetName(open.element) + ">";
+    const std::string shown = Quote(name);
+    fContext.Fail(EStatus::kParseError, "found element <" + shown.substr(1, shown.size() - 2) + ">" + place + ", expected " +
+                                            TTable::DescribeExpected(open.state));
+}
+
+/// Text where only elements may stand must be white space.
+void TCimXmlReader::CheckBlank() const
+{
+    if (fText.empty() || TTable::TakesText(GetState()))
+        return;
+    const std::size_t start = fText.find_first_not_of(" \t\r\n");
+    if (start != std::string_view::npos)
+        fContext.Fail(EStatus::kParseError, "found text " + Quote(fText.substr(start)) + " in <" +
+                                                TElement::GetName(fOpen.back().element) + ">, expected elements alone");
+}
+
+const char* TCimXmlReader::Require(const TCimXmlAttributes& attributes, const char* name) const
+{
+    const char* value = attributes.Find(name);
+    if (value == nullptr || *value == '\0')
+        fContext.Fail(EStatus::kParseError, std::string("found <") + TElement::GetName(fOpen.back().element) + "> without " + name +
+                                                ", expected that attribute with a value");
+    return value;
+}
+
+TType TCimXmlReader::ReadType(const char* text) const
+{
+    const TType type = TValueText::FindType(text);
+    if (type == TType::kNone)
+        fContext.Fail(EStatus::kParseError, "found type " + Quote(text) + ", expected a CIM type such as string or uint32");
+    return type;
+}
+
+void TCimXmlReader::Begin(TTable::EAction action, const TCimXmlAttributes& attributes)
+{
+    switch (action) {
+    case TTable::kBeginProperty:
+        return BeginProperty(attributes, ReadType(Require(attributes, "TYPE")), false);
+    case TTable::kBeginPropertyArray:
+        return BeginProperty(attributes, ReadType(Require(attributes, "TYPE")).GetArrayType(), true);
+    case TTable::kBeginPropertyReference:
+        return BeginProperty(attributes, TType::kReference, false);
+    case TTable::kBeginText:
+        return BeginValue();
+    case TTable::kBeginArray:
+        BeginValue();
+        return fElements.clear();
+    case TTable::kAddNull:
+        return fElements.push_back(TCIMValue::Null(fItem->type.GetElementType()));
+    case TTable::kBeginInstance:
+        return BeginInstance(attributes);
+    case TTable::kBeginObject:
+        return BeginObject();
+    case TTable::kBeginReference:
+        return fPaths.Begin();
+    case TTable::kReadClassName:
+        return fPaths.SetClassName(Require(attributes, fOpen.back().element == TElement::kClassName ? "NAME" : "CLASSNAME"));
+    case TTable::kBeginKeyBinding:
+        return fPaths.BeginKeyBinding(Require(attributes, "NAME"));
+    case TTable::kBeginKeyValue:
+        return fPaths.BeginKeyValue(attributes);
+    case TTable::kBeginNamespacePath:
+        return fPaths.BeginNamespacePath();
+    case TTable::kReadNamespace:
+        return fPaths.AddNamespace(Require(attributes, "NAME"));
+    default:
+        return BeginDeclared(action, attributes);
+    }
+}
+
+/// The actions of declarations and messages, which are rarer.
+void TCimXmlReader::BeginDeclared(TTable::EAction action, const TCimXmlAttributes& attributes)
+{
+    switch (action) {
+    case TTable::kBeginClass:
+        return BeginClass(attributes);
+    case TTable::kBeginMethod:
+        return BeginMethod(attributes);
+    case TTable::kBeginParameter:
+        return BeginParameter(attributes);
+    case TTable::kBeginQualifier:
+        return BeginQualifier(attributes);
+    case TTable::kBeginQualifierDecl:
+        return BeginQualifierDecl(attributes);
+    case TTable::kReadScope:
+        return ReadScope(attributes);
+    case TTable::kReadError:
+        return ReadError(attributes);
+    case TTable::kSkip:
+        return NoteSkipped();
+    default:
+        return;
+    }
+}
+
+void TCimXmlReader::End(TTable::EAction action)
+{
+    switch (action) {
+    case TTable::kEndText:
+        return AddValue(MakeValue(fText));
+    case TTable::kEndProperty:
+        return EndProperty();
+    case TTable::kEndArray:
+        return EndArray();
+    case TTable::kEndInstance:
+        return EndInstance();
+    case TTable::kEndObject:
+        return EndObject();
+    case TTable::kEndReference:
+        return AddValue(TCIMValue(fPaths.End()));
+    case TTable::kEndKeyValue:
+        return fPaths.EndKeyValue(fText);
+    case TTable::kEndHost:
+        return fPaths.SetHost(fText);
+    case TTable::kEndNamespacePath:
+        if (GetState() != TTable::kNamespacePath)  // there it ends with the host's part
+            fPaths.EndNamespacePath();
+        return;
+    default:
+        return EndDeclared(action);
+    }
+}
+
+void TCimXmlReader::EndDeclared(TTable::EAction action)
+{
+    switch (action) {
+    case TTable::kEndClass:
+        return EndClass();
+    case TTable::kEndMethod:
+        return fDraft.EndMethod();
+    case TTable::kEndParameter:
+        return fDraft.EndParameter();
+    case TTable::kEndQualifier:
+        return EndQualifier();
+    case TTable::kEndQualifierDecl:
+        return EndQualifierDecl();
+    default:
+        return;
+    }
+}
+
+void TCimXmlReader::BeginObject()
+{
+    fObjectGiven = false;
+    fPaths.Begin();
+}
+
+void TCimXmlReader::EndObject()
+{
+    if (!fObjectGiven)
+        fContext.Fail(EStatus::kParseError, "found an object without contents, expected a <CLASS> or an <INSTANCE> in it");
+    fPaths.Drop();
+}
+
+/// To be called where a class or an instance starts: an object holds one, and its name tells the namespace.
+void TCimXmlReader::NoteObject()
+{
+    if (fOpen[fOpen.size() - 2].state != TTable::kObject)
+        return;
+    if (fObjectGiven)
+        fContext.Fail(EStatus::kParseError, "found a second object where one is expected");
+    fObjectGiven = true;
+    fPaths.NoteOwnNamespace();
+}
+
+void TCimXmlReader::BeginClass(const TCimXmlAttributes& attributes)
+{
+    NoteObject();
+    fDraft.BeginClass(Require(attributes, "NAME"), attributes.Get("SUPERCLASS"));
+}
+
+void TCimXmlReader::EndClass()
+{
+    TCimXmlDraft draft = fDraft.Take();
+    if (fLoader == nullptr) {
+        fObject = boost::make_shared<const TEmbeddedObject>(std::move(draft.object));
+        return;
+    }
+    const TCimXmlContext::TAt at(fContext, draft.place);
+    fLoader->AddClass(std::move(draft));
+}
+
+void TCimXmlReader::BeginInstance(const TCimXmlAttributes& attributes)
+{
+    NoteObject();
+    const char* name = Require(attributes, "CLASSNAME");
+    fDirect = fLoader != nullptr && fLoader->BeginInstance(name);
+    if (!fDirect)
+        fDraft.BeginInstance(name);
+}
+
+void TCimXmlReader::EndInstance()
+{
+    const bool isNamed = fLoader != nullptr && fPaths.HasOwnPath();
+    if (fDirect) {
+        fDirect = false;
+        return fLoader->EndInstance(isNamed ? &fPaths.GetOwnKeys() : nullptr);
+    }
+    TCimXmlDraft draft = fDraft.Take();
+    if (fLoader == nullptr) {
+        fObject = boost::make_shared<const TEmbeddedObject>(std::move(draft.object));
+        return;
+    }
+    if (isNamed)
+        draft.ownKeys = fPaths.GetOwnKeys();
+    fLoader->AddInstance(std::move(draft));
+}
+
+void TCimXmlReader::BeginItem(TItem& item, const char* name, TType type)
+{
+    item.name = name;
+    item.type = type;
+    item.isEmbedded = false;
+    item.isGiven = false;
+    fItem = &item;
+}
+
+void TCimXmlReader::BeginProperty(const TCimXmlAttributes& attributes, TType type, bool isArray)
+{
+    const char* name = Require(attributes, "NAME");
+    BeginItem(fProperty, name, type);
+    fMetUnknownClass = false;
+    if (fDirect)
+        fTarget = fLoader->FindProperty(name);
+    else
+        fDraft.BeginProperty(name, attributes);
+    if (type == (isArray ? TType::kArrayString : TType::kString))
+        fProperty.isEmbedded = (fDirect && fTarget.isEmbedded) || IsMarkedEmbedded(attributes);
+}
+
+void TCimXmlReader::EndProperty()
+{
+    TCIMValue value = TakeValue(fProperty);
+    if (!fDirect)
+        return fDraft.EndProperty(std::move(value));
+    fLoader->SetProperty(fTarget, std::move(value), fMetUnknownClass);
+}
+
+void TCimXmlReader::BeginMethod(const TCimXmlAttributes& attributes)
+{
+    const char* type = attributes.Find("TYPE");
+    fDraft.BeginMethod(Require(attributes, "NAME"), type != nullptr ? ReadType(type) : TType(TType::kNone), attributes);
+}
+
+void TCimXmlReader::BeginParameter(const TCimXmlAttributes& attributes)
+{
+    const TElement::EElement element = fOpen.back().element;
+    const bool isReference = element == TElement::kParameterReference || element == TElement::kParameterRefArray;
+    const bool isArray = element == TElement::kParameterArray || element == TElement::kParameterRefArray;
+    const TType type = isReference ? TType(TType::kReference) : ReadType(Require(attributes, "TYPE"));
+    fDraft.BeginParameter(Require(attributes, "NAME"), isArray ? type.GetArrayType() : type, attributes);
+}
+
+void TCimXmlReader::BeginQualifier(const TCimXmlAttributes& attributes)
+{
+    BeginItem(fQualifier, Require(attributes, "NAME"), ReadType(Require(attributes, "TYPE")));
+    fFlavor = TCimXmlDraftBuilder::ReadFlavor(attributes);
+    fPropagated = attributes.IsTrue("PROPAGATED", false);
+}
+
+void TCimXmlReader::EndQualifier()
+{
+    TCIMValue value = TakeValue(fQualifier);
+    fItem = &fProperty;
+    if (fDirect)
+        return fContext.Tolerate("qualifier of an instance",
+                                 "qualifier " + Quote(fQualifier.name) + " stands on an instance or its property; left out");
+    fDraft.AddQualifier({fQualifier.name, std::move(value), fFlavor, fPropagated});
+}
+
+void TCimXmlReader::BeginQualifierDecl(const TCimXmlAttributes& attributes)
+{
+    const TType type = ReadType(Require(attributes, "TYPE"));
+    BeginItem(fQualifier, Require(attributes, "NAME"), attributes.IsTrue("ISARRAY", false) ? type.GetArrayType() : type);
+    fFlavor = TCimXmlDraftBuilder::ReadFlavor(attributes);
+    fScope = 0;
+}
+
+void TCimXmlReader::ReadScope(const TCimXmlAttributes& attributes)
+{
+    static constexpr std::pair<const char*, ICIMQualifierDecl::EScope> kScopes[] = {
+        {"CLASS", ICIMQualifierDecl::kScopeClass},           {"ASSOCIATION", ICIMQualifierDecl::kScopeAssociation},
+        {"INDICATION", ICIMQualifierDecl::kScopeIndication}, {"PROPERTY", ICIMQualifierDecl::kScopeProperty},
+        {"REFERENCE", ICIMQualifierDecl::kScopeReference},   {"METHOD", ICIMQualifierDecl::kScopeMethod},
+        {"PARAMETER", ICIMQualifierDecl::kScopeParameter},   {"ANY", ICIMQualifierDecl::kScopeAny}};
+    for (const auto& [name, scope] : kScopes)
+        if (attributes.IsTrue(name, false))
+            fScope |= scope;
+}
+
+void TCimXmlReader::EndQualifierDecl()
+{
+    TCimXmlQualifierDraft draft;
+    draft.name = fQualifier.name;
+    draft.value = TakeValue(fQualifier);
+    draft.scope = ICIMQualifierDecl::EScope(fScope);
+    draft.flavor = fFlavor;
+    fLoader->AddQualifierDecl(draft);
+}
+
+void TCimXmlReader::ReadError(const TCimXmlAttributes& attributes) const
+{
+    fContext.Fail(EStatus::kParseError, std::string("found a response with error ") + attributes.Get("CODE") + " (" +
+                                            Quote(attributes.Get("DESCRIPTION")) + "), expected one with objects");
+}
+
+void TCimXmlReader::NoteSkipped()
+{
+    const char* name = TElement::GetName(fOpen.back().element);
+    fContext.Tolerate(name, std::string("<") + name + "> holds no class or instance; left out");
+}
+
+void TCimXmlReader::BeginValue()
+{
+    if (fOpen[fOpen.size() - 2].state == TTable::kArray)
+        return;
+    if (fItem->isGiven)
+        fContext.Fail(EStatus::kParseError, "found a second value for " + Quote(fItem->name) + ", expected one");
+    fItem->isGiven = true;
+}
+
+/// A value has ended; what it belongs to is the innermost element that is open now.
+void TCimXmlReader::AddValue(TCIMValue value)
+{
+    switch (GetState()) {
+    case TTable::kArray:
+    case TTable::kReferenceArray:
+        return fElements.push_back(std::move(value));
+    case TTable::kKeyBinding:
+    case TTable::kInstanceName:
+        return fPaths.AddKey(std::move(value));
+    default:
+        fItem->value = std::move(value);
+    }
+}
+
+void TCimXmlReader::EndArray()
+{
+    fItem->type = fItem->type.GetArrayType();
+    fItem->value = TCIMValue(fItem->type, static_cast<unsigned int>(fElements.size()), fElements);
+    fElements.clear();
+}
+
+TCIMValue TCimXmlReader::TakeValue(TItem& item)
+{
+    TCIMValue value = item.value.IsNull() ? TCIMValue::Null(item.type) : std::move(item.value);
+    item.value = TCIMValue();
+    return value;
+}
+
+TCIMValue TCimXmlReader::MakeValue(std::string_view text)
+{
+    const TType type = fItem->type.GetElementType();
+    if (type == TType::kString)
+        return fItem->isEmbedded && !text.empty() ? MakeObject(text) : fContext.GetTexts().MakeValue(text);
+    TCIMValue value;
+    if (!TValueText::Parse(type, text, value))
+        fContext.Fail(EStatus::kTypeMismatch, "found " + Quote(text) + " as value of " + Quote(fItem->name) + ", expected a " +
+                                                  TValueText::GetTypeName(type));
+    return value;
+}
+
+TCIMValue TCimXmlReader::MakeObject(std::string_view text)
+{
+    if (fContext.fEmbeddedDepth == kMaxEmbeddedDepth)
+        fContext.Fail(EStatus::kParseError, "embedded objects are nested too deeply");
+    if (!fEmbedded)
+        fEmbedded = std::make_unique<TEmbedded>(fContext, fNamespace);
+    ++fContext.fEmbeddedDepth;
+    TCIMValue value(fEmbedded->Read(text));
+    --fContext.fEmbeddedDepth;
+    return value;
+}
+
+}  // namespace NORVZEL20

@@ -1,0 +1,117 @@
+#pragma once
+
+#include <boost/smart_ptr/shared_ptr.hpp>
+#include <memory>
+#include <string>
+#include <string_view>
+#include <vector>
+
+#include "embedded/TCimXmlContext.h"
+#include "embedded/TCimXmlDraftBuilder.h"
+#include "embedded/TCimXmlLoader.h"
+#include "embedded/TCimXmlPathReader.h"
+#include "embedded/TCimXmlTable.h"
+#include "embedded/TXmlReader.h"
+
+namespace NORVZEL20 {
+
+/// Reads CIM-XML: walks TCimXmlTable by the XML events and does the actions it names.
+///
+/// Qualifier declarations, classes and instances go to the loader, those instances that it can fill directly property by property.
+/// Without a loader, the text is that of an embedded object, which TakeObject gives.
+/// Errors: the context's, thrown from the events.
+class TCimXmlReader : public TXmlReader::ISink {
+  public:
+    /// `ns` (may be null) is where the classes of references are looked up.
+    TCimXmlReader(TCimXmlContext& context, boost::shared_ptr<TInMemNamespace> ns, TCimXmlLoader* loader);
+    ~TCimXmlReader() override;
+
+    void OnStart(const char* name, const char** attributes) override;
+    void OnEnd(const char* name) override;
+    void OnText(const char* text, std::size_t length) override { fText = std::string_view(text, length); }
+
+    /// Starts over, for another embedded object.
+    void Reset();
+    /// The embedded object that was read. Errors: fails with status 13 where there is none.
+    boost::shared_ptr<const TEmbeddedObject> TakeObject();
+
+  private:
+    class TEmbedded;
+    using TTable = TCimXmlTable;
+    using TElement = TCimXmlElement;
+
+    struct TOpen {
+        TTable::EState state;
+        TElement::EElement element;
+    };
+
+    /// What has a value: a property, a qualifier or a qualifier's declaration.
+    struct TItem {
+        std::string name;
+        TCIMValue::TCIMType type = TCIMValue::TCIMType::kNone;
+        bool isEmbedded = false;
+        bool isGiven = false;
+        TCIMValue value;
+    };
+
+    [[noreturn]] void FailUnexpected(const char* name) const;
+    void CheckBlank() const;
+    const char* Require(const TCimXmlAttributes& attributes, const char* name) const;
+    TCIMValue::TCIMType ReadType(const char* text) const;
+    TTable::EState GetState() const noexcept { return fOpen.back().state; }
+
+    void Begin(TTable::EAction action, const TCimXmlAttributes& attributes);
+    void BeginDeclared(TTable::EAction action, const TCimXmlAttributes& attributes);
+    void End(TTable::EAction action);
+    void EndDeclared(TTable::EAction action);
+
+    void BeginObject();
+    void EndObject();
+    void NoteObject();
+    void BeginClass(const TCimXmlAttributes& attributes);
+    void EndClass();
+    void BeginInstance(const TCimXmlAttributes& attributes);
+    void EndInstance();
+    void BeginProperty(const TCimXmlAttributes& attributes, TCIMValue::TCIMType type, bool isArray);
+    void EndProperty();
+    void BeginMethod(const TCimXmlAttributes& attributes);
+    void BeginParameter(const TCimXmlAttributes& attributes);
+    void BeginQualifier(const TCimXmlAttributes& attributes);
+    void EndQualifier();
+    void BeginQualifierDecl(const TCimXmlAttributes& attributes);
+    void ReadScope(const TCimXmlAttributes& attributes);
+    void EndQualifierDecl();
+    void ReadError(const TCimXmlAttributes& attributes) const;
+    void NoteSkipped();
+
+    void BeginItem(TItem& item, const char* name, TCIMValue::TCIMType type);
+    void BeginValue();
+    void AddValue(TCIMValue value);
+    void EndArray();
+    TCIMValue MakeValue(std::string_view text);
+    TCIMValue MakeObject(std::string_view text);
+    TCIMValue TakeValue(TItem& item);
+
+    TCimXmlContext& fContext;
+    boost::shared_ptr<TInMemNamespace> fNamespace;
+    TCimXmlLoader* fLoader;
+    TCimXmlPathReader fPaths;
+    TCimXmlDraftBuilder fDraft;
+    std::vector<TOpen> fOpen;
+    std::string_view fText;
+    TItem fProperty;
+    TItem fQualifier;
+    TItem* fItem = nullptr;
+    std::vector<TCIMValue> fElements;
+    TCimXmlLoader::TTarget fTarget{0, TCIMValue::TCIMType::kNone, false};
+    bool fDirect = false;       // the instance is filled without a draft
+    bool fObjectGiven = false;  // the VALUE.OBJECT that is open has had its class or instance
+    bool fMetUnknownClass = false;
+    ICIMQualifierDecl::EFlavor fFlavor = ICIMQualifierDecl::kFlavorDefault;
+    unsigned int fScope = 0;
+    bool fPropagated = false;
+    boost::shared_ptr<const TEmbeddedObject> fObject;
+    std::unique_ptr<TEmbedded> fEmbedded;
+};
+
+}  // namespace NORVZEL20
