@@ -1,0 +1,174 @@
+#include "client/CommandLine.h"
+
+#include <CLI/CLI.hpp>
+#include <exception>
+#include <functional>
+#include <sstream>
+
+#include "client/CheckCommand.h"
+#include "client/CompareCommand.h"
+#include "client/ExplainCommand.h"
+#include "client/QueryCommand.h"
+#include "client/ShowCommand.h"
+
+namespace NORVZEL20 {
+
+namespace {
+
+const int kTrouble = 2;
+
+const char kInventoryHelp[] = "CIM-XML, plain or compressed with gzip, xz or zstd; - is standard input";
+
+// The arguments of every command and which one was asked for.
+class TCommandLine {
+  public:
+    TCommandLine()
+    {
+        fApp.set_version_flag("--version", std::string("cimdelta ") + CIMDELTA_VERSION);
+        fApp.require_subcommand(1);
+        fApp.footer("Exit status: 0 for success (compare: no differences), 1 for differences, 2 for trouble.\n"
+                    "cimdelta COMMAND --help tells about one command.");
+        AddCompare();
+        AddCheck();
+        AddExplain();
+        AddQuery();
+        AddShow();
+    }
+
+    int Run(int argc, const char* const* argv, IConsole& console)
+    {
+        try {
+            fApp.parse(argc, argv);
+        } catch (const CLI::ParseError& error) {
+            return Answer(error, console);
+        }
+        return fCommand(console);
+    }
+
+  private:
+    // --help and --version are results; everything else is wrong usage.
+    int Answer(const CLI::ParseError& error, IConsole& console)
+    {
+        std::ostringstream out;
+        std::ostringstream err;
+        if (fApp.exit(error, out, err) == 0) {
+            console.WriteResult(out.str());
+            return 0;
+        }
+        const std::vector<CLI::App*> chosen = fApp.get_subcommands();
+        console.Say("cimdelta: " + std::string(error.what()) + "; see cimdelta " +
+                    (chosen.empty() ? "" : chosen[0]->get_name() + " ") + "--help");
+        return kTrouble;
+    }
+
+    CLI::App* AddCommand(const char* name, const char* description, std::function<int(IConsole&)> run)
+    {
+        CLI::App* command = fApp.add_subcommand(name, description);
+        command->callback([this, run] { fCommand = run; });
+        return command;
+    }
+
+    static void AddFormat(CLI::App* command, std::string& format)
+    {
+        command->add_option("-o,--format", format, "text, json, ndjson or cimxml (text)")
+            ->check(CLI::IsMember({"text", "json", "ndjson", "cimxml"}))
+            ->option_text("FORMAT");
+    }
+
+    static void AddOutput(CLI::App* command, std::string& output)
+    {
+        command->add_option("--output", output, "write the result to this file, whole or not at all")->option_text("FILE");
+    }
+
+    static void AddRules(CLI::App* command, std::string& rules, const char* option, const char* help)
+    {
+        command->add_option(option, rules, help)->option_text("RULES");
+    }
+
+    static void AddSchemas(CLI::App* command, std::vector<std::string>& schemas)
+    {
+        command->add_option("--schema", schemas, "inventories to be compared under the rules, the reference first")
+            ->required()
+            ->option_text("INVENTORY...");
+    }
+
+    void AddCompare()
+    {
+        CLI::App* command = AddCommand("compare", "what differs between a reference and other inventories",
+                                       [this](IConsole& console) { return RunCompare(fCompare, console); });
+        command->add_option("REFERENCE", fCompare.reference, kInventoryHelp)->required()->option_text(" ");
+        command->add_option("OTHER", fCompare.others, "compared with the reference, each")->required()->option_text("...");
+        AddRules(command, fCompare.rules, "--spec", "what to compare (everything)");
+        AddFormat(command, fCompare.format);
+        AddOutput(command, fCompare.output);
+        command->add_flag("--strict-schema", fCompare.strictSchema, "declare nothing in inventories that lack what others declare");
+    }
+
+    void AddCheck()
+    {
+        CLI::App* command = AddCommand("check", "what a rules file says and does, and what is odd about it",
+                                       [this](IConsole& console) { return RunCheck(fCheck, console); });
+        AddRules(command->add_option_group("Rules"), fCheck.rules, "RULES", "the rules file");
+        AddSchemas(command, fCheck.schemas);
+        AddOutput(command, fCheck.output);
+    }
+
+    void AddExplain()
+    {
+        CLI::App* command = AddCommand("explain", "which rule decides how a class or a property is compared",
+                                       [this](IConsole& console) { return RunExplain(fExplain, console); });
+        command->add_option("ELEMENT", fExplain.element, "CLASS or CLASS.PROPERTY")->required()->option_text(" ");
+        AddRules(command, fExplain.rules, "--spec", "the rules file");
+        AddSchemas(command, fExplain.schemas);
+        AddOutput(command, fExplain.output);
+    }
+
+    void AddQuery()
+    {
+        CLI::App* command = AddCommand("query", "the instances of an inventory that answer a query",
+                                       [this](IConsole& console) { return RunQuery(fQuery, console); });
+        command->add_option("QUERY", fQuery.query, "WQL: SELECT * | name, ... FROM class [WHERE ...]")
+            ->required()
+            ->option_text(" ");
+        command->add_option("INVENTORY", fQuery.inventory, kInventoryHelp)->required()->option_text(" ");
+        AddFormat(command, fQuery.format);
+        AddOutput(command, fQuery.output);
+    }
+
+    void AddShow()
+    {
+        CLI::App* command = AddCommand("show", "the classes of an inventory, or the instances of a class",
+                                       [this](IConsole& console) { return RunShow(fShow, console); });
+        command->add_option("INVENTORY", fShow.inventory, kInventoryHelp)->required()->option_text(" ");
+        command->add_option("CLASS", fShow.className, "its instances, and those of the classes below it")->option_text(" ");
+        AddFormat(command, fShow.format);
+        AddOutput(command, fShow.output);
+    }
+
+    CLI::App fApp{"Compares inventories held as CIM-XML and tells what differs.", "cimdelta"};
+    std::function<int(IConsole&)> fCommand;
+    TCompareOptions fCompare;
+    TCheckOptions fCheck;
+    TExplainOptions fExplain;
+    TQueryOptions fQuery;
+    TShowOptions fShow;
+};
+
+}  // namespace
+
+int RunClient(int argc, const char* const* argv, IConsole& console) noexcept
+{
+    try {
+        return TCommandLine().Run(argc, argv, console);
+    } catch (const std::bad_alloc&) {
+        console.Say("cimdelta: not enough memory");
+    } catch (const std::exception& error) {
+        // An empty text: whoever read the result went away, and nobody needs to be told.
+        if (*error.what() != '\0') {
+            console.Say(std::string("cimdelta: ") + error.what());
+        }
+    }
+    return kTrouble;
+}
+
+}  // namespace NORVZEL20

@@ -1,0 +1,29 @@
+#pragma once
+
+#include <string>
+
+namespace NORVZEL20 {
+
+/// Where a command's results and its remarks go; a test puts its own in place of the terminal.
+///
+/// Threads: Say from any; WriteResult from one.
+class IConsole {
+  public:
+    virtual ~IConsole() = default;
+
+    /// Writes a whole result to standard output. Errors: TClientError where it does not get there, with an empty text where the
+    /// reader has closed the pipe.
+    virtual void WriteResult(const std::string& text) = 0;
+
+    /// Writes one line, without its end, to standard error. Never throws.
+    virtual void Say(const std::string& line) noexcept = 0;
+
+    /// Whether results are to be coloured: standard output is a terminal and NO_COLOR is not set.
+    virtual bool IsColored() const = 0;
+
+    /// Standard error, for a line that is overwritten: shown only where it is a terminal. An empty text wipes it away. Never
+    /// throws.
+    virtual void ShowProgress(const std::string& text) noexcept = 0;
+};
+
+}  // namespace NORVZEL20

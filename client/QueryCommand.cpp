@@ -1,0 +1,28 @@
+#include "client/QueryCommand.h"
+
+#include "client/InstanceListing.h"
+#include "client/ResultOutput.h"
+#include "client/TClientError.h"
+#include "client/TInventoryLoader.h"
+#include "embedded/TQuery.h"
+#include "embedded/TQueryError.h"
+#include "host/TAddToVectorCallback.h"
+
+namespace NORVZEL20 {
+
+int RunQuery(const TQueryOptions& options, IConsole& console)
+{
+    try {
+        // A query that is wrong is told before the inventory is loaded.
+        const TQuery query("WQL", options.query);
+        const TInventory inventory = TInventoryLoader(console).LoadOne(options.inventory);
+        std::vector<boost::shared_ptr<ICIMInstance>> instances;
+        query.Execute(*inventory.ns, TAddToVectorCallback<ICIMInstance>(&instances));
+        DeliverResult(console, options.output, WriteInstances(*inventory.ns, instances, query.GetProperties(), options.format));
+    } catch (const TQueryError& error) {
+        throw TClientError(error.what());
+    }
+    return 0;
+}
+
+}  // namespace NORVZEL20

@@ -1,0 +1,15 @@
+#pragma once
+
+#include <string>
+
+#include "client/IConsole.h"
+
+namespace NORVZEL20 {
+
+/// Brings a whole result to where the person wants it: the named file, or standard output where `path` is empty.
+///
+/// The file appears whole or not at all: the text is written beside it, then renamed; what was there before stays until then.
+/// Errors: TClientError.
+void DeliverResult(IConsole& console, const std::string& path, const std::string& text);
+
+}  // namespace NORVZEL20

@@ -1,0 +1,46 @@
+#pragma once
+
+#include <boost/smart_ptr/shared_ptr.hpp>
+#include <string>
+#include <vector>
+
+#include "engine/TCIMDiffEngine.h"
+#include "host/ICIMClass.h"
+#include "host/ICIMInstance.h"
+#include "host/ICIMNamespace.h"
+#include "spec/TDiffClassRules.h"
+
+namespace NORVZEL20 {
+
+/// A rules file as the plug-in understands it: the plug-in's own reading, and its own answers to what follows from it.
+class TRules {
+  public:
+    /// Reads the file with `schema` as the reference. `shownName` is what messages call it.
+    /// Errors: TClientError that names the file, the line, what is wrong there and what can be done.
+    TRules(boost::shared_ptr<ICIMNamespace> schema, const std::string& file, const std::string& shownName);
+    TRules(const TRules&) = delete;
+    TRules& operator=(const TRules&) = delete;
+
+    /// The properties to compare; empty where the class's instances are not compared.
+    std::vector<std::string> PropertiesOf(const boost::shared_ptr<ICIMClass>& cls);
+
+    /// The key under which an instance of class `className` is matched.
+    std::string KeyOf(const std::string& className, const boost::shared_ptr<ICIMInstance>& instance);
+
+    /// The class's excluded keys, in the order of the rules.
+    const std::vector<std::string>& ExcludedKeysOf(const std::string& className);
+
+    /// Whether any class excludes any key.
+    bool HasExcludedKeys() const;
+
+  private:
+    boost::shared_ptr<TCIMDiffEngine::TDiffClassRules> Find(const std::string& className);
+
+    std::vector<boost::shared_ptr<ICIMNamespace>> fSchemas;
+    TCIMDiffEngine fEngine;
+    TCIMDiffEngine::TRuleset fRuleset;
+    std::string fFoundName;  // the class looked up last: instances come class by class
+    boost::shared_ptr<TCIMDiffEngine::TDiffClassRules> fFound;
+};
+
+}  // namespace NORVZEL20

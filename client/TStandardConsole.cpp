@@ -1,0 +1,66 @@
+#include "client/TStandardConsole.h"
+
+#include <unistd.h>
+
+#include <cerrno>
+#include <cstdlib>
+#include <cstring>
+
+#include "client/TClientError.h"
+#include "client/WholeWrite.h"
+
+namespace NORVZEL20 {
+
+namespace {
+
+const char kWipeLine[] = "\r\x1b[K";
+
+bool IsTerminal(int descriptor)
+{
+    const char* term = std::getenv("TERM");
+    return isatty(descriptor) != 0 && (term == nullptr || std::strcmp(term, "dumb") != 0);
+}
+
+bool IsSet(const char* variable)
+{
+    const char* value = std::getenv(variable);
+    return value != nullptr && *value != '\0';
+}
+
+}  // namespace
+
+TStandardConsole::TStandardConsole()
+    : fColored(IsTerminal(STDOUT_FILENO) && !IsSet("NO_COLOR")), fProgress(IsTerminal(STDERR_FILENO))
+{}
+
+void TStandardConsole::WriteResult(const std::string& text)
+{
+    const int error = WriteWhole(STDOUT_FILENO, text);
+    if (error == EPIPE) {
+        throw TClientError("");
+    }
+    if (error != 0) {
+        throw TClientError(std::string("standard output cannot be written: ") + std::strerror(error));
+    }
+}
+
+void TStandardConsole::Say(const std::string& line) noexcept
+{
+    const std::lock_guard<std::mutex> lock(fMutex);
+    if (fProgressShown) {
+        WriteWhole(STDERR_FILENO, kWipeLine);
+        fProgressShown = false;
+    }
+    WriteWhole(STDERR_FILENO, line + "\n");
+}
+
+void TStandardConsole::ShowProgress(const std::string& text) noexcept
+{
+    const std::lock_guard<std::mutex> lock(fMutex);
+    if (fProgress && (fProgressShown || !text.empty())) {
+        WriteWhole(STDERR_FILENO, kWipeLine + text);
+        fProgressShown = !text.empty();
+    }
+}
+
+}  // namespace NORVZEL20
