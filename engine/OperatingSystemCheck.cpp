@@ -5,15 +5,19 @@
 
 namespace NORVZEL20 {
 
+namespace {
+
 /// Appends the namespace's operating systems to `systems` and returns the type of the first one of all.
 ///
 /// That first one is always the reference's, so that inventories of different operating systems are compared all the same.
-unsigned short TCIMDiffEngine::AppendOperatingSystems(ICIMNamespace& ns, std::vector<boost::shared_ptr<ICIMInstance>>& systems)
+unsigned short AppendOperatingSystems(ICIMNamespace& ns, std::vector<boost::shared_ptr<ICIMInstance>>& systems)
 {
     const boost::shared_ptr<ICIMClass> cls = ns.GetClass("KALMO_OperatingSystem", TCallContext());
     cls->EnumerateInstances(TAddToVectorCallback<ICIMInstance>(&systems), false, TCallContext());
     return systems.at(0)->GetProperty("OSType", TCallContext())->GetValue(TCallContext());
 }
+
+}  // namespace
 
 void TCIMDiffEngine::CheckOperatingSystems()
 {

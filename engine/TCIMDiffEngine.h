@@ -126,7 +126,6 @@ class TCIMDiffEngine {
     class TClassComparison;
 
     void CheckOperatingSystems();
-    unsigned short AppendOperatingSystems(ICIMNamespace& ns, std::vector<boost::shared_ptr<ICIMInstance>>& systems);
     void CompareSubClasses(ICIMClass& cls);
     void AliasInstance(ICIMInstance& instance, const std::string& key, unsigned int namespaceIndex);
     bool IsDifferent(boost::shared_ptr<TDiffClassRules> rules, const TCIMValue& master, const TCIMValue& other);

@@ -3,19 +3,11 @@
 #include <utility>
 
 #include "host/TZELException.h"
+#include "provider/Refuse.h"
 #include "provider/TCallbackWrapClass.h"
 #include "provider/TDeltaNamespace.h"
 
 namespace NORVZEL20 {
-
-namespace {
-
-[[noreturn]] void Refuse()
-{
-    throw TZELException(TZELStatusCode::kNotSupported);
-}
-
-}  // namespace
 
 TDeltaClass::TDeltaClass(boost::shared_ptr<TDeltaNamespace> deltaNamespace, boost::shared_ptr<ICIMClass> cls)
     : fDeltaNamespace(std::move(deltaNamespace)), fClass(std::move(cls))

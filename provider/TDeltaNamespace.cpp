@@ -8,6 +8,7 @@
 #include "host/TNamespaceProviderManager.h"
 #include "host/TOSSpecific.h"
 #include "host/TZELException.h"
+#include "provider/Refuse.h"
 #include "provider/TDeltaClass.h"
 #include "provider/TDeltaNamespaceProvider.h"
 
@@ -16,11 +17,6 @@ namespace NORVZEL20 {
 namespace {
 
 const std::string kFileSeparator = "/";
-
-[[noreturn]] void Refuse()
-{
-    throw TZELException(TZELStatusCode::kNotSupported);
-}
 
 }  // namespace
 
