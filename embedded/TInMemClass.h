@@ -103,6 +103,8 @@ class TInMemClass final : public TInMemNamedElement<ICIMClass>, public boost::en
     const boost::shared_ptr<TInMemClass>& GetSuperInMemClass() const noexcept { return fSuper; }
     /// The direct subclasses in order of declaration.
     std::vector<boost::shared_ptr<TInMemClass>> GetSubClasses() const;
+    /// All classes below this one, each before its own subclasses.
+    std::vector<boost::shared_ptr<TInMemClass>> GetClassesBelow() const;
     /// Null where the namespace is gone.
     boost::shared_ptr<TInMemNamespace> GetInMemNamespace() const { return fNamespace.lock(); }
     /// The namespace's name, also when it is gone.
@@ -139,23 +141,33 @@ class TInMemClass final : public TInMemNamedElement<ICIMClass>, public boost::en
     friend class TInMemNamespace;
     friend class TInMemInstance;
     friend class TInMemPropertyDecl;
+    friend class TInMemStaging;
 
     explicit TInMemClass(const std::string& name);
 
-    void QualifiersChanged() override;
+    boost::shared_ptr<TInMemNamespace> RequireNamespace() const;
+    TInMemExtent& GetExtent() const;
+    TCIMReference MakePath() const;
+    bool HasInstances() const;
+    bool IsPseudoClass() const noexcept;
+
+    boost::shared_ptr<TInMemPropertyDecl> FindOwnDecl(std::string_view name) const;
+    boost::shared_ptr<TInMemMethodDecl> FindOwnMethod(std::string_view name) const;
     void InheritSlots();
-    void AddSlot(const boost::shared_ptr<TInMemPropertyDecl>& decl);
-    void SetSlotDecl(const boost::shared_ptr<TInMemPropertyDecl>& decl);
-    void DropSlot(const TInMemPropertyDecl& decl);
+    void InheritDecl(std::string_view name);
+    void AppendSlot(const boost::shared_ptr<TInMemPropertyDecl>& decl);
+    void CheckOverrides(const TInMemPropertyDecl& decl) const;
+    void DeclChanged(const TInMemPropertyDecl& decl);
+    void MethodChanged(std::string_view name);
+    void UpdateLayout();
     void UpdateOrder();
     void UpdateKeys();
-    void LayoutChanged();
-    bool HasInstances() const;
-    TInMemExtent& GetExtent() const;
-    void Attach(TInMemExtent& extent);
-    void Detach() noexcept;
+
     bool RefersTo(const TInMemClass& cls, std::string_view role) const;
-    std::vector<boost::shared_ptr<TInMemClass>> FindAssociationClasses(const std::string& resultClass, const std::string& role);
+    std::vector<boost::shared_ptr<TInMemClass>> FindAssociationClasses(const std::string& resultClass,
+                                                                       const std::string& role) const;
+    void AddOtherEnds(const TInMemClass& association, const std::string& role, const std::string& resultRole,
+                      const std::string& resultClass, std::vector<boost::shared_ptr<TInMemClass>>& ends) const;
 
     std::string fName;
     std::string fNamespaceName;
@@ -170,6 +182,8 @@ class TInMemClass final : public TInMemNamedElement<ICIMClass>, public boost::en
     THashIndex fSlotIndex;
     std::vector<std::uint32_t> fOrder;
     std::vector<std::uint32_t> fKeySlots;
+    std::uint32_t fLayout = 0;       // counts the changes of slots, order and keys
+    std::uint32_t fSuperLayout = 0;  // the superclass's count when its slots were last taken over
 };
 
 }  // namespace NORVZEL20

@@ -51,8 +51,11 @@ class TInMemExtent {
 
   private:
     std::uint32_t HashOf(const TInMemInstance& instance) const;
-    std::uint32_t FindSame(std::uint32_t hash, const TInMemInstance& instance) const;
+    bool HasSameKeys(const TInMemInstance& a, const TInMemInstance& b) const;
+    void CheckNew(std::uint32_t hash, const TInMemInstance& instance) const;
+    void CheckKeys(const TInMemInstance& instance) const;
     void FillGenerated(TInMemInstance& instance);
+    void CountGenerated(const TInMemInstance& instance) noexcept;
     void Compact();
 
     const TInMemClass& fClass;

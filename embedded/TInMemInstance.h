@@ -9,6 +9,7 @@
 #include <vector>
 
 #include "embedded/TInMemProperty.h"
+#include "embedded/TTailAllocator.h"
 #include "host/ICIMInstance.h"
 
 namespace NORVZEL20 {
@@ -21,8 +22,8 @@ class TInMemClass;
 /// stay valid when the instance is deleted and when the namespace goes; AddToNamespace then throws status 18.
 class TInMemInstance final : public ICIMInstance, public boost::enable_shared_from_this<TInMemInstance> {
   public:
-    /// For TInMemClass alone: `room` is uninitialised memory of BlockSize(slots) bytes that outlives the instance.
-    TInMemInstance(boost::shared_ptr<TInMemClass> cls, void* room, std::uint32_t slots) noexcept;
+    /// For TInMemClass alone: the tail is uninitialised memory of GetBlockSize(slots) bytes in the instance's own block.
+    TInMemInstance(boost::shared_ptr<TInMemClass> cls, const TTail& tail, std::uint32_t slots) noexcept;
     TInMemInstance(const TInMemInstance&) = delete;
     TInMemInstance& operator=(const TInMemInstance&) = delete;
     ~TInMemInstance() override;
@@ -55,32 +56,40 @@ class TInMemInstance final : public ICIMInstance, public boost::enable_shared_fr
     /// The name of the first key without a value, which keeps the instance from being added; null where there is none.
     const std::string* FindMissingKey() const;
 
-    static std::size_t BlockSize(std::uint32_t slots) noexcept;
+    static std::size_t GetBlockSize(std::uint32_t slots) noexcept;
 
   private:
     friend class TInMemProperty;
     friend class TInMemExtent;
 
-    struct TBlock;   // the head of a block of properties: which instance, which slots
-    struct TExtras;  // what few instances have: later properties, earlier values, keys as added
-    struct TBlockDeleter {
-        void operator()(TBlock* block) const noexcept;
+    struct TBlock;   // a block of properties: whose it is, and how many of which slots
+    struct TExtras;  // what few instances have
+    struct TSlotValue {
+        std::uint32_t slot;
+        TCIMValue value;
     };
 
-    static TBlock* MakeBlock(void* room, TInMemInstance& owner, const TInMemClass& cls, std::uint32_t first,
-                             std::uint32_t count) noexcept;
+    static TBlock* MakeBlock(void* room, TInMemInstance& owner, std::uint32_t first, std::uint32_t count) noexcept;
+    static void DestroyBlock(TBlock& block) noexcept;
+    static TInMemInstance& GetOwner(const TInMemProperty* first) noexcept;
+    static const TCIMValue* Find(const std::vector<TSlotValue>& values, std::uint32_t slot) noexcept;
+
+    boost::shared_ptr<ICIMProperty> GetHandle(std::uint32_t slot, const boost::shared_ptr<const TInMemInstance>& self) const;
     TExtras& GetExtras() const;
     TInMemProperty& GetLateProperty(std::uint32_t slot) const;
     void Change(TInMemProperty& property, TCIMValue value);
+    void MarkChanged(TInMemProperty& property, const TCIMValue& value);
     void RememberKey(const TInMemProperty& property);
-    void RememberEarlier(const TInMemProperty& property);
     const TCIMValue* FindEarlier(std::uint32_t slot) const noexcept;
     /// The value of a key as it was when the instance was added.
     const TCIMValue& GetAddedKey(std::uint32_t slot) const;
+    void SetAdded(std::uint32_t keyHash) noexcept;
+    void SetRemoved() noexcept;
 
     boost::shared_ptr<TInMemClass> fClass;
     TBlock* fBlock;
     mutable std::unique_ptr<TExtras> fExtras;
+    std::uint32_t fKeyHash = 0;  // of the keys as added
     bool fAdded = false;
 };
 

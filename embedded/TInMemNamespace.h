@@ -48,7 +48,7 @@ class TInMemNamespace final : public ICIMNamespace, public ILocated, public boos
     void Subscribe(boost::shared_ptr<ICIMIndicationFilter> filter,
                    const boost::function<bool(boost::shared_ptr<ICIMInstance>)>& callback, TCallContext context) override;
     /// The path's class and keys count, its namespace and host do not. Key values are converted to the declared types where
-    /// nothing is lost by it (see TKeyConversion).
+    /// nothing is lost by it, so that a path read from text finds what it names.
     boost::shared_ptr<ICIMInstance> GetInstance(const TCIMReference& path, TCallContext context) const override;
     void DeleteInstance(const TCIMReference& path, TCallContext context) override;
     void ModifyInstance(const TCIMReference& path, TCallContext properties, TCallContext context) override;
@@ -71,6 +71,8 @@ class TInMemNamespace final : public ICIMNamespace, public ILocated, public boos
     const std::vector<boost::shared_ptr<TInMemQualifierDecl>>& GetQualifierDecls() const noexcept { return fQualifierDecls; }
     /// Errors: status 12 where one of that name is declared.
     void AddQualifierDecl(boost::shared_ptr<TInMemQualifierDecl> decl);
+    /// Finds instances anew by keys that hold references, whose paths change with the spelling of a class.
+    void ReindexReferences();
     /// The instance of that path, or null where there is none or no such class. Errors: status 13, 14.
     boost::shared_ptr<TInMemInstance> FindInstance(const TCIMReference& path) const;
 
@@ -80,16 +82,23 @@ class TInMemNamespace final : public ICIMNamespace, public ILocated, public boos
 
     explicit TInMemNamespace(const std::string& name);
 
+    struct TEntry {
+        boost::shared_ptr<TInMemClass> cls;
+        std::unique_ptr<TInMemExtent> extent;
+    };
+
     boost::shared_ptr<TInMemInstance> RequireInstance(const TCIMReference& path) const;
+    void CheckNew(const TInMemClass& cls) const;
     void Declare(const boost::shared_ptr<TInMemClass>& cls);
-    void Withdraw(TInMemClass& cls);
-    void TakeBackQualifierDecl(const TInMemQualifierDecl& decl) noexcept;
+    void Withdraw(TInMemClass& cls) noexcept;
+    void Withdraw(const TInMemQualifierDecl& decl) noexcept;
+    /// The class above `cls`, "<root>" for a top-level class.
+    TInMemClass& GetParent(const TInMemClass& cls) const noexcept;
 
     std::string fName;
     boost::shared_ptr<TInMemClass> fRoot;  // "<root>": its subclasses are the top-level classes
     std::vector<boost::shared_ptr<TInMemClass>> fClasses;
-    TNameHashMap<boost::shared_ptr<TInMemClass>> fClassesByName;
-    TNameHashMap<std::unique_ptr<TInMemExtent>> fExtents;  // by class name
+    TNameHashMap<TEntry> fClassesByName;
     std::vector<boost::shared_ptr<TInMemQualifierDecl>> fQualifierDecls;
     TNameHashMap<boost::shared_ptr<TInMemQualifierDecl>> fQualifierDeclsByName;
 };

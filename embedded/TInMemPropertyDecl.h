@@ -45,11 +45,18 @@ class TInMemPropertyDecl : public TInMemNamedElement<ICIMPropertyDecl>, public b
     /// The value as the property holds it: nulls typed, bags marked. Errors: status 13 where the type is not the declared one.
     TCIMValue Fit(TCIMValue value) const;
 
+    /// The value with a stub in the place of each class that a reference in it holds. A class owns its declarations, so that a
+    /// value kept in one of them must not own the class.
+    static TCIMValue WithoutClasses(TCIMValue value);
+
     /// Spells the name another way. Errors: status 5 where more than letter case differs.
     void SetSpelling(const std::string& name);
 
     /// The declaration of an ancestor that this one overrides, from which it inherits qualifiers; null for none.
     const boost::shared_ptr<TInMemPropertyDecl>& GetOverridden() const noexcept { return fOverridden; }
+
+    /// The class that declares it; null before it is added to one, and where that is gone.
+    boost::shared_ptr<TInMemClass> GetOwner() const { return fOwner.lock(); }
 
     /// The one value of a property with the qualifier Static; an ordinary property's is null and of no use.
     TInMemStaticProperty& GetStaticProperty() noexcept { return fStaticProperty; }
@@ -58,7 +65,8 @@ class TInMemPropertyDecl : public TInMemNamedElement<ICIMPropertyDecl>, public b
     friend class TInMemClass;
 
     void QualifiersChanged() override;
-    bool FindBag() const;
+    void UpdateMarks();
+    bool IsBagDeclared() const;
     void Override(boost::shared_ptr<TInMemPropertyDecl> overridden);
 
     std::string fName;

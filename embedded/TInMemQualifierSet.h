@@ -32,9 +32,10 @@ class TInMemQualifierSet {
     /// Whether the element or any that it stems from has one of that name with the value TRUE, whatever its flavor.
     bool IsTrueAnywhere(std::string_view name) const;
 
-  private:
+    /// The element's own one of that name, or null.
     boost::shared_ptr<ICIMQualifier> FindOwn(std::string_view name) const;
 
+  private:
     std::vector<boost::shared_ptr<ICIMQualifier>> fOwn;
     const TInMemQualifierSet* fParent = nullptr;
 };

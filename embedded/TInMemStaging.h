@@ -1,7 +1,7 @@
 #pragma once
 
 #include <boost/smart_ptr/shared_ptr.hpp>
-#include <utility>
+#include <unordered_map>
 #include <vector>
 
 #include "embedded/TInMemNamespace.h"
@@ -37,8 +37,8 @@ class TInMemStaging {
     boost::shared_ptr<TInMemNamespace> fNamespace;
     std::vector<boost::shared_ptr<TInMemQualifierDecl>> fQualifierDecls;
     std::vector<boost::shared_ptr<TInMemClass>> fClasses;
-    std::vector<std::pair<TInMemExtent*, TInMemExtent::TMark>> fExtents;  // those of before that got instances
-    TInMemExtent* fLast = nullptr;                                        // the extent of the last instance
+    std::unordered_map<TInMemExtent*, TInMemExtent::TMark> fExtents;  // those that got instances, as they were before
+    TInMemExtent* fLast = nullptr;                                    // the extent of the last instance
     bool fCommitted = false;
 };
 

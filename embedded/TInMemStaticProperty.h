@@ -22,6 +22,7 @@ class TInMemStaticProperty : public ICIMProperty {
     boost::shared_ptr<const ICIMPropertyDecl> GetPropertyDecl(TCallContext context) const override;
 
     const TCIMValue& GetValue() const noexcept { return fValue; }
+    void SetValue(const TCIMValue& value);
 
   private:
     friend class TInMemPropertyDecl;

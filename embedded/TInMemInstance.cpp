@@ -1,0 +1,265 @@
+#include "embedded/TInMemInstance.h"
+
+#include "embedded/TInMemClass.h"
+#include "embedded/TInMemNamespace.h"
+#include "host/TZELException.h"
+
+namespace NORVZEL20 {
+
+/// The head of a block; the properties follow it.
+struct TInMemInstance::TBlock {
+    TInMemInstance* owner;
+    std::uint32_t first;  ///< the slot of the first property
+    std::uint32_t count;
+
+    TInMemProperty* GetProperties() noexcept { return reinterpret_cast<TInMemProperty*>(this + 1); }
+};
+
+struct TInMemInstance::TExtras {
+    TExtras() = default;
+    TExtras(const TExtras&) = delete;
+    TExtras& operator=(const TExtras&) = delete;
+    ~TExtras()
+    {
+        for (TBlock* block : late) {
+            DestroyBlock(*block);
+            ::operator delete(block);
+        }
+    }
+
+    std::vector<TBlock*> late;        ///< properties that the class got after the instance was made, in order of slots
+    std::vector<TSlotValue> earlier;  ///< values before the first MarkChanged
+    std::vector<TSlotValue> keys;     ///< keys as added, where they have changed since
+};
+
+std::size_t TInMemInstance::GetBlockSize(std::uint32_t slots) noexcept
+{
+    return sizeof(TBlock) + slots * sizeof(TInMemProperty);
+}
+
+TInMemInstance::TBlock* TInMemInstance::MakeBlock(void* room, TInMemInstance& owner, std::uint32_t first,
+                                                  std::uint32_t count) noexcept
+{
+    TBlock* const block = new (room) TBlock{&owner, first, count};
+    for (std::uint32_t position = 0; position < count; ++position) {
+        const std::uint32_t slot = first + position;
+        const TCIMValue null = TCIMValue::Null(owner.fClass->GetSlotDecl(slot).GetType());
+        new (block->GetProperties() + position) TInMemProperty(slot, position, null);
+    }
+    return block;
+}
+
+void TInMemInstance::DestroyBlock(TBlock& block) noexcept
+{
+    for (std::uint32_t position = 0; position < block.count; ++position) {
+        block.GetProperties()[position].~TInMemProperty();
+    }
+}
+
+TInMemInstance& TInMemInstance::GetOwner(const TInMemProperty* first) noexcept
+{
+    return *(reinterpret_cast<const TBlock*>(first) - 1)->owner;
+}
+
+TInMemInstance::TInMemInstance(boost::shared_ptr<TInMemClass> cls, const TTail& tail, std::uint32_t slots) noexcept
+    : fClass(std::move(cls)), fBlock(MakeBlock(tail.address, *this, 0, slots))
+{}
+
+TInMemInstance::~TInMemInstance()
+{
+    DestroyBlock(*fBlock);
+}
+
+void TInMemInstance::Validate(TCallContext) const
+{
+    fClass->GetExtent().Check(*this);
+}
+
+void TInMemInstance::AddToNamespace(TCallContext)
+{
+    fClass->GetExtent().Add(shared_from_this());
+}
+
+TCIMReference TInMemInstance::GetReference() const
+{
+    TCIMReference path = fClass->MakePath();
+    for (const std::uint32_t slot : fClass->GetKeySlots()) {
+        path.AddKeyValue(fClass->GetSlotDecl(slot).GetName(), GetAddedKey(slot));
+    }
+    return path;
+}
+
+TCIMReference TInMemInstance::GetReference(TCallContext) const
+{
+    return GetReference();
+}
+
+boost::shared_ptr<ICIMClass> TInMemInstance::GetClass(TCallContext) const
+{
+    return fClass;
+}
+
+boost::shared_ptr<ICIMProperty> TInMemInstance::GetHandle(std::uint32_t slot,
+                                                          const boost::shared_ptr<const TInMemInstance>& self) const
+{
+    const auto& decl = fClass->GetSharedSlotDecl(slot);
+    if (decl->IsStatic()) {
+        return boost::shared_ptr<ICIMProperty>(decl, &decl->GetStaticProperty());
+    }
+    return boost::shared_ptr<ICIMProperty>(self, &GetSlotProperty(slot));
+}
+
+boost::shared_ptr<ICIMProperty> TInMemInstance::GetProperty(const std::string& name, TCallContext) const
+{
+    const std::uint32_t slot = fClass->FindSlot(name);
+    if (slot == TInMemClass::kNoSlot) {
+        throw TZELException(TZELStatusCode::kNotFound);
+    }
+    return GetHandle(slot, shared_from_this());
+}
+
+void TInMemInstance::EnumerateProperties(const boost::function<bool(boost::shared_ptr<ICIMProperty>)>& callback, TCallContext) const
+{
+    const auto self = shared_from_this();
+    const std::vector<std::uint32_t>& order = fClass->GetSlotOrder();
+    for (std::size_t at = 0; at < order.size(); ++at) {
+        if (!callback(GetHandle(order[at], self))) {
+            return;
+        }
+    }
+}
+
+TInMemProperty* TInMemInstance::FindProperty(std::string_view name) const
+{
+    const std::uint32_t slot = fClass->FindSlot(name);
+    if (slot == TInMemClass::kNoSlot || fClass->GetSlotDecl(slot).IsStatic()) {
+        return nullptr;
+    }
+    return &GetSlotProperty(slot);
+}
+
+TInMemProperty& TInMemInstance::GetSlotProperty(std::uint32_t slot) const
+{
+    return slot < fBlock->count ? fBlock->GetProperties()[slot] : GetLateProperty(slot);
+}
+
+const TCIMValue& TInMemInstance::GetSlotValue(std::uint32_t slot) const
+{
+    const auto& decl = fClass->GetSharedSlotDecl(slot);
+    return decl->IsStatic() ? decl->GetStaticProperty().GetValue() : GetSlotProperty(slot).GetValue();
+}
+
+void TInMemInstance::SetSlot(std::uint32_t slot, TCIMValue value)
+{
+    const auto& decl = fClass->GetSharedSlotDecl(slot);
+    if (decl->IsStatic()) {
+        decl->GetStaticProperty().SetValue(value);
+        return;
+    }
+    Change(GetSlotProperty(slot), std::move(value));
+}
+
+const std::string* TInMemInstance::FindMissingKey() const
+{
+    for (const std::uint32_t slot : fClass->GetKeySlots()) {
+        const TInMemPropertyDecl& decl = fClass->GetSlotDecl(slot);
+        if (!decl.IsGenerated() && GetSlotValue(slot).IsNull()) {
+            return &decl.GetName();
+        }
+    }
+    return nullptr;
+}
+
+TInMemInstance::TExtras& TInMemInstance::GetExtras() const
+{
+    if (!fExtras) {
+        fExtras = std::make_unique<TExtras>();
+    }
+    return *fExtras;
+}
+
+TInMemProperty& TInMemInstance::GetLateProperty(std::uint32_t slot) const
+{
+    std::vector<TBlock*>& late = GetExtras().late;
+    std::uint32_t end = fBlock->count;
+    for (TBlock* block : late) {
+        end = block->first + block->count;
+        if (slot < end) {
+            return block->GetProperties()[slot - block->first];
+        }
+    }
+    late.reserve(late.size() + 1);
+    const std::uint32_t count = fClass->GetSlotCount() - end;
+    // Properties refer to the instance as one that can be changed, which it is: it is always made by TInMemClass.
+    late.push_back(MakeBlock(::operator new(GetBlockSize(count)), const_cast<TInMemInstance&>(*this), end, count));
+    return late.back()->GetProperties()[slot - end];
+}
+
+void TInMemInstance::Change(TInMemProperty& property, TCIMValue value)
+{
+    const TInMemPropertyDecl& decl = fClass->GetSlotDecl(property.fSlot);
+    TCIMValue fitting = decl.Fit(std::move(value));
+    if (fAdded && decl.IsKey()) {
+        RememberKey(property);
+    }
+    property.fValue = std::move(fitting);
+}
+
+void TInMemInstance::MarkChanged(TInMemProperty& property, const TCIMValue& value)
+{
+    if (property.fChanged) {
+        Change(property, value);
+        return;
+    }
+    std::vector<TSlotValue>& earlier = GetExtras().earlier;
+    earlier.reserve(earlier.size() + 1);
+    TSlotValue before{property.fSlot, property.fValue};
+    Change(property, value);
+    earlier.push_back(std::move(before));
+    property.fChanged = 1;
+}
+
+void TInMemInstance::RememberKey(const TInMemProperty& property)
+{
+    std::vector<TSlotValue>& keys = GetExtras().keys;
+    if (!Find(keys, property.fSlot)) {
+        keys.push_back(TSlotValue{property.fSlot, property.fValue});
+    }
+}
+
+const TCIMValue* TInMemInstance::Find(const std::vector<TSlotValue>& values, std::uint32_t slot) noexcept
+{
+    for (const TSlotValue& entry : values) {
+        if (entry.slot == slot) {
+            return &entry.value;
+        }
+    }
+    return nullptr;
+}
+
+const TCIMValue* TInMemInstance::FindEarlier(std::uint32_t slot) const noexcept
+{
+    return fExtras ? Find(fExtras->earlier, slot) : nullptr;
+}
+
+const TCIMValue& TInMemInstance::GetAddedKey(std::uint32_t slot) const
+{
+    const TCIMValue* const added = fExtras ? Find(fExtras->keys, slot) : nullptr;
+    return added ? *added : GetSlotValue(slot);
+}
+
+void TInMemInstance::SetAdded(std::uint32_t keyHash) noexcept
+{
+    fKeyHash = keyHash;
+    fAdded = true;
+}
+
+void TInMemInstance::SetRemoved() noexcept
+{
+    fAdded = false;
+    if (fExtras) {
+        fExtras->keys.clear();
+    }
+}
+
+}  // namespace NORVZEL20

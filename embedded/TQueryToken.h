@@ -1,0 +1,23 @@
+#pragma once
+
+#include <cstddef>
+#include <string>
+
+namespace NORVZEL20 {
+
+/// A piece of a query's text.
+struct TQueryToken {
+    enum EKind {
+        kEnd,     ///< behind the last piece; its text is empty
+        kName,    ///< a key word or a name, as written
+        kText,    ///< a literal, without its quotes and escapes
+        kNumber,  ///< as written
+        kSymbol   ///< an operator or a punctuation mark
+    };
+
+    EKind fKind = kEnd;
+    std::string fText;
+    std::size_t fPosition = 0;  ///< of its first byte
+};
+
+}  // namespace NORVZEL20
