@@ -1,0 +1,111 @@
+#include "tests/client/ClientTest.h"
+
+namespace NORVZEL20 {
+namespace {
+
+class BadInputTest : public ClientTest {};
+
+TEST_F(BadInputTest, EachUnusableRulesFileGetsOneMessage)
+{
+    const struct {
+        const char* rules;
+        const char* message;
+    } rows[] = {
+        {"<difftoolspec/>",
+         "R:1: element difftoolspec is not expected here; a file is DifftoolSpec > class > includelist or excludelist > value"},
+        {"<DifftoolSpec version='1.1'/>",
+         "R:1: DifftoolSpec has an attribute or a version that is not known; its only attribute is version, at most \"1.0\""},
+        {"<DifftoolSpec foo='1.0'/>",
+         "R:1: DifftoolSpec has an attribute or a version that is not known; its only attribute is version, at most \"1.0\""},
+        {"<DifftoolSpec>\n<clas name='INV_Disk'/></DifftoolSpec>",
+         "R:2: element clas is not expected here; a file is DifftoolSpec > class > includelist or excludelist > value"},
+        {"<DifftoolSpec>\n\n<class default='include'/></DifftoolSpec>",
+         "R:3: element class has no name; give it the name of a class of the reference"},
+        {"<DifftoolSpec>\n<class name=''/></DifftoolSpec>",
+         "R:2: element class has no name; give it the name of a class of the reference"},
+        {"<DifftoolSpec>\n<class name='INV_Dsk'/></DifftoolSpec>",
+         "R:2: class INV_Dsk is not declared in the reference; correct the name or remove the element"},
+        {"<DifftoolSpec><class name='INV_Disk' default='Include'/></DifftoolSpec>",
+         "R:1: default is neither \"include\" nor \"exclude\"; letter case counts"},
+        {"<DifftoolSpec><class name='INV_Disk' deflt='include'/></DifftoolSpec>",
+         "R:1: element class has an attribute that is not known; its attributes are name, default and excludekeys"},
+        {"<DifftoolSpec><class name='INV_Disk'><list/></class></DifftoolSpec>",
+         "R:1: element list is not expected here; a file is DifftoolSpec > class > includelist or excludelist > value"},
+        {"<DifftoolSpec>\n<class name='INV_Disk'>\n<includelist>\n<value>Sise</value>\n</includelist></class></DifftoolSpec>",
+         "R:4: class INV_Disk has no property \"Sise\"; the name counts as it stands between the tags, blanks included"},
+        {"<DifftoolSpec><class name='INV_Disk'><includelist><value> Model </value></includelist></class></DifftoolSpec>",
+         "R:1: class INV_Disk has no property \" Model \"; the name counts as it stands between the tags, blanks included"},
+        {"<DifftoolSpec>\n<class name='INV_Disk'>\n</DifftoolSpec>", "R:3: mismatched tag; correct the file"},
+        {"<DifftoolSpec>", "R:1: no element found; correct the file"},
+        {"", "R:1: no element found; correct the file"},
+        {"rules", "R:1: syntax error; correct the file"},
+    };
+    int number = 0;
+    for (const auto& row : rows) {
+        SCOPED_TRACE(row.rules);
+        const std::string rules = Scratch(std::to_string(number++), row.rules);
+        const std::string expected = std::string("cimdelta: ") + row.message + "\n";
+        EXPECT_EQ(expected, Shorten(Complaint({"compare", "--spec", rules, "web01.xml", "web02.xml"}), rules, "R"));
+        EXPECT_EQ(expected, Shorten(Complaint({"check", rules, "--schema", "web01.xml"}), rules, "R"));
+    }
+}
+
+TEST_F(BadInputTest, RulesThatAreNoFileAreToldApart)
+{
+    EXPECT_EQ("cimdelta: none.xml: cannot be opened: No such file or directory\n",
+              Complaint({"compare", "--spec", "none.xml", "web01.xml", "web02.xml"}));
+    EXPECT_EQ("cimdelta: .: is no regular file; save the rules to a file and name that\n",
+              Complaint({"compare", "--spec", ".", "web01.xml", "web02.xml"}));
+    EXPECT_EQ("cimdelta: rules.xml|fVMWareEnable: a rules file cannot have |fVMWareEnable in its name; rename it\n",
+              Complaint({"compare", "--spec", "rules.xml|fVMWareEnable", "web01.xml", "web02.xml"}));
+}
+
+TEST_F(BadInputTest, RulesLargerThanTheLimitAreRefused)
+{
+    const std::string rules = Scratch("large", "");
+    ASSERT_EQ(0, truncate(rules.c_str(), 104857601));
+    EXPECT_EQ("cimdelta: R: is larger than 104857600 bytes, the most that a rules file may have\n",
+              Shorten(Complaint({"compare", "--spec", rules, "web01.xml", "web02.xml"}), rules, "R"));
+}
+
+TEST_F(BadInputTest, InventoriesThatCannotBeOpenedAreNamed)
+{
+    EXPECT_EQ("cimdelta: none.xml: cannot be opened: No such file or directory\n", Complaint({"compare", "none.xml", "web02.xml"}));
+    EXPECT_EQ("cimdelta: none.xml: cannot be opened: No such file or directory\n", Complaint({"show", "none.xml"}));
+    EXPECT_EQ("cimdelta: .: is a directory; name an inventory file, or - for standard input\n",
+              Complaint({"compare", "web01.xml", "."}));
+    EXPECT_EQ("cimdelta: standard input (-) can be read only once; save it to a file first\n", Complaint({"compare", "-", "-"}));
+}
+
+TEST_F(BadInputTest, OfSeveralBadInventoriesTheFirstIsTold)
+{
+    for (int i = 0; i < 20; ++i) {
+        EXPECT_EQ("cimdelta: none.xml: cannot be opened: No such file or directory\n",
+                  Complaint({"compare", "web01.xml", "none.xml", ".", "web02.xml"}));
+    }
+}
+
+TEST_F(BadInputTest, CompressedFilesThatEndEarlyAreTold)
+{
+    for (const char* suffix : {".gz", ".xz", ".zst"}) {
+        const std::string whole = ReadFile(std::string("web02.xml") + suffix);
+        const std::string half = Scratch(std::string("half") + suffix, whole.substr(0, whole.size() / 2));
+        const std::string message = Shorten(Complaint({"show", half}), half, "H");
+        EXPECT_EQ(0u, message.find("cimdelta: H: cannot be read: ")) << message;
+        EXPECT_NE(std::string::npos, message.find("; is the file whole?")) << message;
+    }
+}
+
+TEST_F(BadInputTest, WrongUsageIsToldInOneLine)
+{
+    EXPECT_EQ("cimdelta: A subcommand is required; see cimdelta --help\n", Complaint({}));
+    EXPECT_EQ("cimdelta: OTHER is required; see cimdelta compare --help\n", Complaint({"compare", "web01.xml"}));
+    EXPECT_EQ("cimdelta: --schema is required; see cimdelta check --help\n", Complaint({"check", "rules.xml"}));
+    EXPECT_EQ("cimdelta: -o: html not in {text,json,ndjson,cimxml}; see cimdelta compare --help\n",
+              Complaint({"compare", "-o", "html", "web01.xml", "web02.xml"}));
+    EXPECT_EQ("cimdelta: The following argument was not expected: --wrong; see cimdelta compare --help\n",
+              Complaint({"compare", "web01.xml", "web02.xml", "--wrong"}));
+}
+
+}  // namespace
+}  // namespace NORVZEL20
