@@ -1,0 +1,177 @@
+#include <gtest/gtest.h>
+
+#include <atomic>
+#include <condition_variable>
+#include <functional>
+#include <mutex>
+#include <thread>
+
+#include "embedded/TCimXmlPopulator.h"
+#include "embedded/TCoreLog.h"
+#include "host/TZELException.h"
+#include "tests/faults/DifferingNamespaces.h"
+#include "tests/support/Dump.h"
+#include "tests/support/TComparison.h"
+#include "tests/support/TTemporaryFile.h"
+#include "tests/support/TTestAccess.h"
+
+namespace NORVZEL20 {
+namespace {
+
+const std::size_t kThreads = 8;
+
+/// Lets threads go on when all of them are there.
+class TStartLine {
+  public:
+    void Wait()
+    {
+        std::unique_lock<std::mutex> lock(fMutex);
+        if (++fWaiting == kThreads) {
+            fAllThere.notify_all();
+        }
+        fAllThere.wait(lock, [this] { return fWaiting == kThreads; });
+    }
+
+  private:
+    std::mutex fMutex;
+    std::condition_variable fAllThere;
+    std::size_t fWaiting = 0;
+};
+
+/// What each of eight threads made, all of them at work at once.
+std::vector<std::string> DoAtOnce(const std::function<std::string()>& work)
+{
+    TStartLine start;
+    std::vector<std::string> results(kThreads);
+    std::vector<std::thread> threads;
+    for (std::string& result : results) {
+        threads.emplace_back([&] {
+            start.Wait();
+            result = work();
+        });
+    }
+    for (std::thread& thread : threads) {
+        thread.join();
+    }
+    return results;
+}
+
+/// Checks that threads at once make what one makes alone. The one comes last, so that nothing is ready when they begin.
+void ExpectAsAlone(const std::function<std::string()>& work)
+{
+    const std::vector<std::string> results = DoAtOnce(work);
+    const std::string alone = work();
+    EXPECT_NE("", alone);
+    EXPECT_EQ(std::vector<std::string>(kThreads, alone), results);
+}
+
+/// Counts entries, from any thread.
+class TCountingLogger : public ILogger {
+  public:
+    TCountingLogger() : fBefore(TCoreLog::Set(this)) {}
+    TCountingLogger(const TCountingLogger&) = delete;
+    TCountingLogger& operator=(const TCountingLogger&) = delete;
+    ~TCountingLogger() override { TCoreLog::Set(fBefore); }
+
+    void Log(int, const std::string&) override { ++fCount; }
+    std::size_t GetCount() const { return fCount; }
+
+  private:
+    ILogger* fBefore;
+    std::atomic<std::size_t> fCount{0};
+};
+
+/// A few runs of a delta namespace over namespaces of its own; the records and what became of the reference.
+std::string Compare(std::size_t namespaces, const std::string& rules)
+{
+    std::string text;
+    for (int round = 0; round < 5; ++round) {
+        const auto delta = MakeDeltaNamespace(EHost::kInmem);
+        for (std::size_t index = 0; index < namespaces; ++index) {
+            TNamespaceBuilder builder(MakeNamespace(EHost::kInmem, "root/cimv2"));
+            FillDiffering(builder.OperatingSystem(), index);
+            delta->AddNamespaceToCompareList(builder.GetNamespace());
+        }
+        delta->SetSpecFileName(rules);
+        delta->FindDifferences();
+        delta->FindDifferences();
+        text += DumpRecords(TTestAccess::Store(*delta)) + DumpAliases(*delta) + DumpDiffering(TTestAccess::CompareList(*delta)[0]);
+        TTestAccess::ForgetWrappers(*delta);
+    }
+    return text;
+}
+
+const char kDocumentHead[] =
+    "<CIM CIMVERSION='2.0' DTDVERSION='2.0'><DECLARATION><DECLGROUP>"
+    "<VALUE.OBJECT><CLASS NAME='Disk'><PROPERTY NAME='Id' TYPE='string'><QUALIFIER NAME='Key' TYPE='boolean'><VALUE>true</VALUE>"
+    "</QUALIFIER></PROPERTY><PROPERTY NAME='Size' TYPE='uint64'/><PROPERTY NAME='Made' TYPE='datetime'/></CLASS></VALUE.OBJECT>";
+
+std::string MakeDocument()
+{
+    std::string text = kDocumentHead;
+    for (int number = 0; number < 200; ++number) {
+        text += "<VALUE.OBJECT><INSTANCE CLASSNAME='Disk'><PROPERTY NAME='Id' TYPE='string'><VALUE>disk number " +
+                std::to_string(number) + "</VALUE></PROPERTY><PROPERTY NAME='Size' TYPE='uint64'><VALUE>" +
+                std::to_string(number * 512) +
+                "</VALUE></PROPERTY><PROPERTY NAME='Made' TYPE='datetime'><VALUE>20240229120000.000000+060</VALUE></PROPERTY>"
+                "</INSTANCE></VALUE.OBJECT>\n";
+    }
+    return text + "</DECLGROUP></DECLARATION></CIM>";
+}
+
+TEST(Threads, EightComparisonsOfTwoNamespacesAreAsOne)
+{
+    const TTemporaryFile rules(RulesForDiffering(true));
+    ExpectAsAlone([&rules] { return Compare(2, rules.GetPath()); });
+}
+
+TEST(Threads, EightComparisonsOfThreeNamespacesAreAsOne)
+{
+    const TTemporaryFile rules(RulesForDiffering(false));
+    ExpectAsAlone([&rules] { return Compare(3, rules.GetPath()); });
+}
+
+TEST(Threads, EightComparisonsThatFailLogEach)
+{
+    TCountingLogger log;
+    const TTemporaryFile rules("<DifftoolSpec><class name='Nowhere'/></DifftoolSpec>");
+    ExpectAsAlone([&rules]() -> std::string {
+        try {
+            return Compare(2, rules.GetPath());
+        } catch (const TZELException& error) {
+            return "status " + std::to_string(error.GetStatusCode().GetStatus());
+        }
+    });
+    EXPECT_EQ(2 * (kThreads + 1), log.GetCount());
+}
+
+TEST(Threads, EightInventoriesLoadAsOne)
+{
+    const TTemporaryFile file(MakeDocument());
+    ExpectAsAlone([&file] {
+        const auto ns = MakeNamespace(EHost::kInmem, "root/cimv2");
+        TCimXmlPopulator(ns).LoadFile(file.GetPath());
+        return DumpInstances(ns, "Disk");
+    });
+}
+
+TEST(Threads, EightQueriesOverNamespacesOfTheirOwnAreAsOne)
+{
+    const std::string document = MakeDocument();
+    ExpectAsAlone([&document] {
+        const auto ns = MakeNamespace(EHost::kInmem, "root/cimv2");
+        TCimXmlPopulator(ns).LoadFromMemory(document.data(), document.size(), "disks.xml");
+        std::string found;
+        std::string language = "WQL";
+        std::string query = "SELECT * FROM Disk WHERE Size > 100000 OR Id LIKE '%9'";
+        const auto append = [&found](boost::shared_ptr<ICIMInstance> instance) {
+            found += instance->GetReference({}).GetPath() + "\n";
+            return true;
+        };
+        ns->ExecuteQuery(append, language, query, {});
+        return found;
+    });
+}
+
+}  // namespace
+}  // namespace NORVZEL20
