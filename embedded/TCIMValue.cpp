@@ -434,6 +434,8 @@ void TCIMValue::AppendKeyText(std::string& out) const
     case TAccess::kNumber:
         if (fType == TCIMType::kChar16) {
             TValueText::AppendQuoted(out, ToText(), '\'');
+        } else if ((fType == TCIMType::kReal32 || fType == TCIMType::kReal64) && GetReal() == 0) {
+            out += '0';  // equal values have equal paths, and -0 equals 0
         } else {
             TValueText::AppendPlain(out, *this);
         }
