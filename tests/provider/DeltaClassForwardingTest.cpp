@@ -1,0 +1,165 @@
+#include <boost/smart_ptr/make_shared.hpp>
+
+#include "provider/TDeltaClass.h"
+#include "tests/provider/TDeltaFixture.h"
+#include "tests/support/TPlainQualifier.h"
+#include "tests/support/TTestAccess.h"
+
+namespace NORVZEL20 {
+namespace {
+
+const TCallContext kNone;
+
+// Questions to the wrapper of Base in the compared namespace 1; the wrapped class writes down what reaches it.
+class DeltaClassForwardingTest : public TDeltaFixture {
+  protected:
+    DeltaClassForwardingTest() : fBase(Delta().GetClass("Base", At(1))) { Watch().Forget(); }
+
+    // The one call that reached the wrapped class, without its name.
+    std::string Call()
+    {
+        const std::string text = Watch().TakeText();
+        const std::string start = "ns1:Base.";
+        return text.compare(0, start.size(), start) == 0 ? text.substr(start.size()) : text;
+    }
+
+    template <class T>
+    static bool Take(boost::shared_ptr<T>)
+    {
+        return true;
+    }
+
+    boost::shared_ptr<ICIMClass> fBase;
+};
+
+TEST_F(DeltaClassForwardingTest, QuestionsAboutTheClass)
+{
+    fBase->Validate(At(1));
+    EXPECT_EQ("Validate() {nsIndex=1}\n", Call());
+    EXPECT_EQ("Base", fBase->GetName(At(1)));
+    EXPECT_EQ("GetName() {nsIndex=1}\n", Call());
+    EXPECT_EQ(fComparison.Namespace(1).GetNamespace(), fBase->GetNamespace(At(1)));
+    EXPECT_EQ("GetNamespace() {nsIndex=1}\n", Call());
+    EXPECT_FALSE(fBase->IsAssociation(At(1)));
+    EXPECT_EQ("IsAssociation() {nsIndex=1}\n", Call());
+    EXPECT_FALSE(fBase->IsAbstract(At(1)));
+    EXPECT_EQ("IsAbstract() {nsIndex=1}\n", Call());
+    EXPECT_TRUE(fBase->IsRootClass(At(1)));
+    EXPECT_EQ("IsRootClass() {nsIndex=1}\n", Call());
+}
+
+TEST_F(DeltaClassForwardingTest, KeyNamesArePassedDirectly)
+{
+    const std::string* name = nullptr;
+    fBase->EnumerateKeyNames([&](const std::string* each) { return name = each, true; }, At(1));
+    EXPECT_EQ("EnumerateKeyNames() {nsIndex=1}\n", Call());
+    const auto base = fComparison.Namespace(1).GetNamespace()->GetClass("Base", kNone);
+    EXPECT_EQ(&base->GetPropertyDecl("Id", kNone)->GetName(kNone), name);
+}
+
+TEST_F(DeltaClassForwardingTest, DeclarationsOfProperties)
+{
+    EXPECT_EQ("Id", fBase->GetPropertyDecl("Id", At(1))->GetName(kNone));
+    EXPECT_EQ("GetPropertyDecl(\"Id\") {nsIndex=1}\n", Call());
+    fBase->EnumeratePropertyDecls(&Take<ICIMPropertyDecl>, At(1));
+    EXPECT_EQ("EnumeratePropertyDecls() {nsIndex=1}\n", Call());
+}
+
+TEST_F(DeltaClassForwardingTest, StaticProperties)
+{
+    EXPECT_EQ(31, StatusOf([&] { fBase->GetProperty("Id", At(1)); }));
+    EXPECT_EQ("GetProperty(\"Id\") {nsIndex=1}\n", Call());
+    EXPECT_EQ(31, StatusOf([&] { fBase->SetPropertyValue("Id", TCIMValue(5), At(1)); }));
+    EXPECT_EQ("SetPropertyValue(\"Id\", 5) {nsIndex=1}\n", Call());
+    fBase->EnumerateStaticProperties(&Take<ICIMProperty>, At(1));
+    EXPECT_EQ("EnumerateStaticProperties() {nsIndex=1}\n", Call());
+}
+
+TEST_F(DeltaClassForwardingTest, InstancesWithTheFlagUntouched)
+{
+    fBase->EnumerateInstances(&Take<ICIMInstance>, false, At(1));
+    EXPECT_EQ("EnumerateInstances(false) {nsIndex=1}\n", Call());
+    fBase->EnumerateInstances(&Take<ICIMInstance>, true, At(1));
+    EXPECT_EQ("EnumerateInstances(true) {nsIndex=1}\n", Call());
+}
+
+TEST_F(DeltaClassForwardingTest, DeclarationsOfMethods)
+{
+    EXPECT_EQ(15, StatusOf([&] { fBase->GetMethodDecl("Run", At(1)); }));
+    EXPECT_EQ("GetMethodDecl(\"Run\") {nsIndex=1}\n", Call());
+    fBase->EnumerateMethodDecls(&Take<ICIMMethodDecl>, At(1));
+    EXPECT_EQ("EnumerateMethodDecls() {nsIndex=1}\n", Call());
+}
+
+TEST_F(DeltaClassForwardingTest, QualifiersThroughEitherBase)
+{
+    const auto note = boost::make_shared<TPlainQualifier>("Note", TCIMValue("x"), ICIMQualifierDecl::kFlavorDefault);
+    ICIMNamedElement& named = *fBase;
+    named.AddQualifier(note, At(1));
+    EXPECT_EQ("AddQualifier() {nsIndex=1}\n", Call());
+    EXPECT_EQ(note, fBase->GetQualifier("Note", At(1)));
+    EXPECT_EQ("GetQualifier(\"Note\") {nsIndex=1}\n", Call());
+    EXPECT_EQ(note, named.GetQualifier("Note", At(1)));
+    EXPECT_EQ("GetQualifier(\"Note\") {nsIndex=1}\n", Call());
+    int seen = 0;
+    fBase->EnumerateQualifiers([&](boost::shared_ptr<ICIMQualifier>) { return ++seen, true; }, At(1));
+    EXPECT_EQ(1, seen);
+    EXPECT_EQ("EnumerateQualifiers() {nsIndex=1}\n", Call());
+}
+
+TEST_F(DeltaClassForwardingTest, ElementsThatAreAddedAndRemoved)
+{
+    EXPECT_TRUE(fBase->AddChildClass(fComparison.Namespace(1).GetNamespace()->GetClass("Sub", kNone)));
+    EXPECT_EQ("AddChildClass(Sub)\n", Call());
+    EXPECT_TRUE(fBase->RemoveChildClass(fComparison.Namespace(1).GetNamespace()->GetClass("Sub", kNone)));
+    EXPECT_EQ("RemoveChildClass(Sub)\n", Call());
+    EXPECT_FALSE(fBase->RemoveChildClass(fComparison.Namespace(1).GetNamespace()->GetClass("Sub", kNone)));
+    EXPECT_EQ("RemoveChildClass(Sub)\n", Call());
+    EXPECT_TRUE(fBase->AddAssociationClass(fBase));
+    EXPECT_EQ(0u, Call().find("AddAssociationClass(Base)\n"));
+    EXPECT_FALSE(fBase->RemoveAssociationClass(fBase));
+    EXPECT_EQ(0u, Call().find("RemoveAssociationClass(Base)\n"));
+    EXPECT_FALSE(fBase->RemovePropertyDecl(nullptr));
+    EXPECT_EQ("RemovePropertyDecl()\n", Call());
+    EXPECT_TRUE(fBase->AddMethodDecl(nullptr));
+    EXPECT_EQ("AddMethodDecl()\n", Call());
+    EXPECT_FALSE(fBase->RemoveMethodDecl(nullptr));
+    EXPECT_EQ("RemoveMethodDecl()\n", Call());
+}
+
+TEST_F(DeltaClassForwardingTest, ADeclarationAddedLandsInTheWrappedClass)
+{
+    const auto base = fComparison.Namespace(1).GetNamespace()->GetClass("Base", kNone);
+    EXPECT_TRUE(fBase->AddPropertyDecl(base->AllocatePropertyDecl("Late", TCIMValue("x"), kNone)));
+    EXPECT_EQ("AddPropertyDecl()\n", Call());
+    EXPECT_EQ("Late", base->GetPropertyDecl("Late", kNone)->GetName(kNone));
+}
+
+TEST_F(DeltaClassForwardingTest, AnInstanceAddedLandsInTheWrappedClass)
+{
+    const auto base = fComparison.Namespace(1).GetNamespace()->GetClass("Base", kNone);
+    const auto instance = base->AllocateInstance(kNone);
+    int count = 0;
+    const auto increment = [&](boost::shared_ptr<ICIMInstance>) { return ++count, true; };
+    EXPECT_TRUE(fBase->AddInstance(instance));
+    EXPECT_EQ("AddInstance()\n", Call());
+    base->EnumerateInstances(increment, false, kNone);
+    EXPECT_EQ(1, count);
+    EXPECT_TRUE(fBase->RemoveInstance(instance));
+    EXPECT_EQ("RemoveInstance()\n", Call());
+    EXPECT_FALSE(fBase->RemoveInstance(instance));
+    base->EnumerateInstances(increment, false, kNone);
+    EXPECT_EQ(1, count);
+}
+
+TEST_F(DeltaClassForwardingTest, ErrorsOfTheWrappedClassPassThrough)
+{
+    Watch().FailCallsOf("ns1:Base.", TZELStatusCode::kNamespaceGone);
+    EXPECT_EQ(18, StatusOf([&] { fBase->GetName(At(1)); }));
+    EXPECT_EQ(18, StatusOf([&] { fBase->Validate(At(1)); }));
+    EXPECT_EQ(18, StatusOf([&] { fBase->AddInstance(nullptr); }));
+    EXPECT_EQ(18, StatusOf([&] { fBase->EnumerateSubClasses(&Take<ICIMClass>, false, At(1)); }));
+}
+
+}  // namespace
+}  // namespace NORVZEL20

@@ -1,0 +1,158 @@
+#include <dlfcn.h>
+
+#include "host/TNamespacePopulator.h"
+#include "host/TNamespaceProviderManager.h"
+#include "host/TOSSpecific.h"
+#include "host/TRootObject.h"
+#include "host/TZELException.h"
+#include "provider/TDeltaNamespaceProvider.h"
+#include "tests/provider/TDeltaFixture.h"
+#include "tests/support/CallText.h"
+#include "tests/support/TPlainNamespace.h"
+#include "tests/support/TTestAccess.h"
+
+// This program's own versions of some operations of the host stand in front of the library's, so that tests see each call and
+// have it answer what they want. The library asks for the manager before this program's objects are made: flags and pointers only.
+namespace NORVZEL20 {
+namespace {
+
+bool gIsManagerMissing = false;
+bool gIsProviderMissing = false;
+int gPopulationStatus = 0;
+const char* gRoot = "";
+std::string* gCalls = nullptr;
+
+template <class TOperation>
+TOperation Original(const char* symbol)
+{
+    return reinterpret_cast<TOperation>(dlsym(RTLD_NEXT, symbol));
+}
+
+// Answers as "inmem" does, and tells what it was asked.
+class TTellingProvider : public INamespaceProvider {
+  public:
+    const std::string& GetName(TCallContext) const override { return fName; }
+    boost::shared_ptr<ICIMNamespace> AllocateNamespace(TCallContext context, bool flag, std::string name) const override
+    {
+        *gCalls += "AllocateNamespace" + ContextText(context) + " " + FlagText(flag) + " " + Quoted(name) + "\n";
+        return TPlainNamespace::Create(name);
+    }
+    int GetType(TCallContext) const override { return 0; }
+    bool IsIndicationsSupported(TCallContext) const override { return false; }
+
+  private:
+    std::string fName = "inmem";
+};
+
+}  // namespace
+
+boost::shared_ptr<INamespaceProviderManager> TRootObject::GetNamespaceProviderManager()
+{
+    if (gIsManagerMissing) {
+        return nullptr;
+    }
+    using TOperation = boost::shared_ptr<INamespaceProviderManager> (*)();
+    return Original<TOperation>("_ZN8NORVZEL2011TRootObject27GetNamespaceProviderManagerEv")();
+}
+
+boost::shared_ptr<TNamespaceProviderManager> TNamespaceProviderManager::GetInstance()
+{
+    if (gIsManagerMissing) {
+        return nullptr;
+    }
+    using TOperation = boost::shared_ptr<TNamespaceProviderManager> (*)();
+    return Original<TOperation>("_ZN8NORVZEL2025TNamespaceProviderManager11GetInstanceEv")();
+}
+
+boost::shared_ptr<INamespaceProvider> TNamespaceProviderManager::FindProvider(const std::string& name)
+{
+    if (gIsProviderMissing) {
+        return nullptr;
+    }
+    *gCalls += "FindProvider " + Quoted(name) + "\n";
+    return boost::shared_ptr<INamespaceProvider>(new TTellingProvider);
+}
+
+std::string TOSSpecific::GetZELRootPath()
+{
+    return gRoot;
+}
+
+std::vector<boost::shared_ptr<ICIMElement>> TNamespacePopulator::PopulateFromXMLFile(boost::shared_ptr<ICIMNamespace> ns,
+                                                                                     std::string path)
+{
+    *gCalls += "PopulateFromXMLFile " + std::string(ns ? "store" : "null") + " " + path + "\n";
+    if (gPopulationStatus != 0) {
+        throw TZELException(static_cast<TZELStatusCode::EStatusCode>(gPopulationStatus));
+    }
+    return {};
+}
+
+namespace {
+
+class StartTest : public testing::Test {
+  protected:
+    StartTest() { gCalls = &fCalls; }
+    ~StartTest() override
+    {
+        gIsManagerMissing = false;
+        gIsProviderMissing = false;
+        gPopulationStatus = 0;
+    }
+
+    std::string CallsWithRoot(const char* root)
+    {
+        gRoot = root;
+        fCalls.clear();
+        TDeltaNamespaceProvider::GetInstance()->AllocateNamespace(TCallContext(), true, "other");
+        return fCalls;
+    }
+
+    std::string fCalls;
+};
+
+TEST_F(StartTest, TheStoreIsAllocatedAndFilledWithTheSchema)
+{
+    EXPECT_EQ("FindProvider \"inmem\"\n"
+              "AllocateNamespace {} false \"root/cimv2\"\n"
+              "PopulateFromXMLFile store /opt/x/data/deltaclasses.properties.xml\n",
+              CallsWithRoot("/opt/x"));
+}
+
+TEST_F(StartTest, TheRootIsTakenAsTheHostGivesIt)
+{
+    EXPECT_NE(std::string::npos, CallsWithRoot("/opt/x/").find(" /opt/x//data/deltaclasses.properties.xml\n"));
+    EXPECT_NE(std::string::npos, CallsWithRoot("").find(" /data/deltaclasses.properties.xml\n"));
+    EXPECT_NE(std::string::npos, CallsWithRoot("a b").find(" a b/data/deltaclasses.properties.xml\n"));
+}
+
+TEST_F(StartTest, AFailureOfThePopulatorLeavesTheAllocation)
+{
+    gPopulationStatus = TZELStatusCode::kFileError;
+    EXPECT_EQ(11, StatusOf([&] { CallsWithRoot("/opt/x"); }));
+    gPopulationStatus = TZELStatusCode::kParseError;
+    EXPECT_EQ(9, StatusOf([&] { CallsWithRoot("/opt/x"); }));
+}
+
+TEST_F(StartTest, AMissingStoreProviderFailsTheAssertion)
+{
+    gIsProviderMissing = true;
+    EXPECT_TRUE(FailsOnNull([&] { CallsWithRoot("/opt/x"); }));
+}
+
+TEST_F(StartTest, AMissingManagerFailsTheAssertion)
+{
+    gIsManagerMissing = true;
+    EXPECT_TRUE(FailsOnNull([&] { CallsWithRoot("/opt/x"); }));
+    EXPECT_TRUE(FailsOnNull([] { TDeltaNamespaceProvider::Initialize(); }));
+}
+
+TEST_F(StartTest, TheConstructorWithAnArgumentAsksTheHostForNothing)
+{
+    const TDeltaNamespace inert{boost::shared_ptr<const ICIMNamespace>()};
+    EXPECT_EQ("", fCalls);
+    EXPECT_EQ(nullptr, TTestAccess::Store(inert));
+}
+
+}  // namespace
+}  // namespace NORVZEL20

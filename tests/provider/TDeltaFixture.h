@@ -1,0 +1,33 @@
+#pragma once
+
+#include <gtest/gtest.h>
+
+#include <functional>
+#include <string>
+
+#include "tests/support/TCapturingLogger.h"
+#include "tests/support/TComparison.h"
+
+namespace NORVZEL20 {
+
+/// A delta namespace over three compared ones of the plain host, everything watched. Each holds Base (key Id) > Sub.
+class TDeltaFixture : public testing::Test {
+  protected:
+    TDeltaFixture();
+
+    /// A call context with that "nsIndex".
+    static TCallContext At(unsigned short index);
+
+    TCallWatch& Watch() { return fComparison.GetWatch(); }
+    TDeltaNamespace& Delta() { return fComparison.Delta(); }
+
+    TCapturingLogger fLog;
+    TComparison fComparison;
+};
+
+/// The status that the call throws, or 0 where it throws nothing.
+int StatusOf(const std::function<void()>& call);
+/// Whether the call fails the host's assertion "px != 0".
+bool FailsOnNull(const std::function<void()>& call);
+
+}  // namespace NORVZEL20
