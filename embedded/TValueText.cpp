@@ -123,20 +123,35 @@ bool ReadNamedReal(std::string_view text, double& number)
     return TNameText::Equal(text, "INF");
 }
 
+// Whether a number that is out of range is too small for the type rather than too large; it then becomes 0, or the least number.
+template <class T>
+bool RoundsToZero(std::string_view text, T& number)
+{
+    long double wide = 0;
+    const auto read = std::from_chars(text.data(), text.data() + text.size(), wide);
+    if (read.ec != std::errc() || wide <= -1 || wide >= 1) {
+        return false;
+    }
+    number = static_cast<T>(wide);
+    return true;
+}
+
 template <class T>
 bool ReadReal(std::string_view text, T& number)
 {
-    if (!text.empty() && text[0] == '+') {
-        text.remove_prefix(1);
-    }
-    // The library's own words for infinity and not-a-number are more than CIM has.
-    const std::size_t first = !text.empty() && text[0] == '-' ? 1 : 0;
-    if (first >= text.size() || (text[first] != '.' && (text[first] < '0' || text[first] > '9'))) {
+    const bool hasSign = !text.empty() && (text[0] == '+' || text[0] == '-');
+    const char first = text.size() > (hasSign ? 1u : 0u) ? text[hasSign ? 1 : 0] : '\0';
+    // The library's own words for infinity and not-a-number are more than CIM has, and its numbers have no plus sign.
+    if (first != '.' && (first < '0' || first > '9')) {
         return false;
     }
+    text.remove_prefix(text[0] == '+' ? 1 : 0);
     const char* const end = text.data() + text.size();
     const auto read = std::from_chars(text.data(), end, number);
-    return read.ec == std::errc() && read.ptr == end;
+    if (read.ptr != end) {
+        return false;
+    }
+    return read.ec == std::errc() || RoundsToZero(text, number);
 }
 
 bool ParseReal(TType::ECIMType type, std::string_view text, TCIMValue& result)
