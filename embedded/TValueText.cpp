@@ -5,9 +5,10 @@
 #include <limits>
 #include <system_error>
 
+#include "embedded/TInteger.h"
 #include "embedded/TNameText.h"
 #include "embedded/TValueAccess.h"
-#include "host/TZELException.h"
+#include "host/TCIMDateTime.h"
 
 namespace NORVZEL20 {
 
@@ -15,60 +16,8 @@ namespace {
 
 using TType = TCIMValue::TCIMType;
 
-struct TIntegerRange {
-    std::int64_t fLeast;
-    std::uint64_t fGreatest;
-};
-
-template <class T>
-constexpr TIntegerRange kRangeOf{std::numeric_limits<T>::min(), std::uint64_t(std::numeric_limits<T>::max())};
-
-// By type code, from uint8 to sint64.
-constexpr TIntegerRange kIntegerRanges[] = {kRangeOf<std::uint8_t>,  kRangeOf<std::int8_t>,   kRangeOf<std::uint16_t>,
-                                            kRangeOf<std::int16_t>,  kRangeOf<std::uint32_t>, kRangeOf<std::int32_t>,
-                                            kRangeOf<std::uint64_t>, kRangeOf<std::int64_t>};
-
 constexpr const char* kTypeNames[] = {"",       "boolean", "uint8",  "sint8",  "uint16", "sint16", "uint32",   "sint32",
                                       "uint64", "sint64",  "real32", "real64", "char16", "string", "datetime", "reference"};
-
-bool IsInteger(TType::ECIMType type) noexcept
-{
-    return type >= TType::kUint8 && type <= TType::kSint64;
-}
-
-bool IsSignedInteger(TType::ECIMType type) noexcept
-{
-    return IsInteger(type) && (type - TType::kUint8) % 2 == 1;
-}
-
-bool IsReal(TType::ECIMType type) noexcept
-{
-    return type == TType::kReal32 || type == TType::kReal64;
-}
-
-/// An integer of either kind: its size and on which side of zero it is.
-struct TInteger {
-    std::uint64_t fMagnitude;
-    bool fIsNegative;
-};
-
-bool MakeInteger(TType::ECIMType type, TInteger number, TCIMValue& result)
-{
-    const TIntegerRange& range = kIntegerRanges[type - TType::kUint8];
-    const std::uint64_t bound = number.fIsNegative ? std::uint64_t(0) - std::uint64_t(range.fLeast) : range.fGreatest;
-    if (number.fMagnitude > bound) {
-        return false;
-    }
-    result = TValueAccess::FromBits(type, number.fIsNegative ? std::uint64_t(0) - number.fMagnitude : number.fMagnitude);
-    return true;
-}
-
-TInteger ReadBits(const TCIMValue& value) noexcept
-{
-    const std::uint64_t bits = TValueAccess::GetBits(value);
-    const bool isNegative = IsSignedInteger(value.GetType()) && (bits >> 63) != 0;
-    return {isNegative ? std::uint64_t(0) - bits : bits, isNegative};
-}
 
 std::string_view Trim(std::string_view text) noexcept
 {
@@ -98,7 +47,7 @@ bool ParseBoolean(std::string_view text, TCIMValue& result)
 bool ParseInteger(TType::ECIMType type, std::string_view text, TCIMValue& result)
 {
     TInteger number{0, !text.empty() && text[0] == '-'};
-    if (number.fIsNegative && !IsSignedInteger(type)) {
+    if (number.fIsNegative && !TInteger::IsOfSigned(type)) {
         return false;
     }
     if (number.fIsNegative || (!text.empty() && text[0] == '+')) {
@@ -106,7 +55,7 @@ bool ParseInteger(TType::ECIMType type, std::string_view text, TCIMValue& result
     }
     const bool isHexadecimal = text.size() > 2 && text[0] == '0' && TNameText::ToLower(text[1]) == 'x';
     const bool isRead = isHexadecimal ? ReadAll(text.substr(2), number.fMagnitude, 16) : ReadAll(text, number.fMagnitude, 10);
-    return isRead && MakeInteger(type, number, result);
+    return isRead && number.Make(type, result);
 }
 
 bool ReadNamedReal(std::string_view text, double& number)
@@ -206,62 +155,6 @@ bool ParseDateTime(std::string_view text, TCIMValue& result)
     return true;
 }
 
-bool ConvertToReal(const TCIMValue& value, TType::ECIMType type, TCIMValue& result)
-{
-    double number = 0;
-    if (IsReal(value.GetType())) {
-        number = value.GetReal();
-    } else {
-        const TInteger integer = ReadBits(value);
-        number = double(integer.fMagnitude);
-        // 2^64 itself would not convert back.
-        if (number >= 0x1p64 || std::uint64_t(number) != integer.fMagnitude) {
-            return false;
-        }
-        number = integer.fIsNegative ? -number : number;
-    }
-    if (type == TType::kReal32 && !std::isnan(number) && !std::isinf(number) &&
-        (std::fabs(number) > double(std::numeric_limits<float>::max()) || double(float(number)) != number)) {
-        return false;
-    }
-    result = TValueAccess::FromReal(type, number);
-    return true;
-}
-
-bool ConvertToPath(std::string_view text, TCIMValue& result)
-{
-    try {
-        result = TCIMValue(TCIMReference::Parse(std::string(text)));
-        return true;
-    } catch (const TZELException&) {
-        return false;
-    }
-}
-
-bool ConvertArray(const TCIMValue& value, TType type, TCIMValue& result)
-{
-    std::vector<TCIMValue> elements;
-    elements.reserve(value.GetElements().size());
-    for (const TCIMValue& element : value.GetElements()) {
-        elements.emplace_back();
-        if (!TValueText::Convert(element, type.GetElementType(), elements.back())) {
-            return false;
-        }
-    }
-    TCIMValue array(type, unsigned(elements.size()), elements);
-    result = value.IsBag() ? array.AsBag() : array;
-    return true;
-}
-
-bool ConvertNumber(const TCIMValue& value, TType::ECIMType type, TCIMValue& result)
-{
-    const bool isInteger = IsInteger(value.GetType());
-    if (isInteger && IsInteger(type)) {
-        return MakeInteger(type, ReadBits(value), result);
-    }
-    return (isInteger || IsReal(value.GetType())) && IsReal(type) && ConvertToReal(value, type, result);
-}
-
 }  // namespace
 
 bool TValueText::Parse(TCIMValue::TCIMType type, std::string_view text, TCIMValue& result)
@@ -280,34 +173,8 @@ bool TValueText::Parse(TCIMValue::TCIMType type, std::string_view text, TCIMValu
     case TType::kReal64:
         return ParseReal(type, Trim(text), result);
     default:
-        return IsInteger(type) && ParseInteger(type, Trim(text), result);
+        return TInteger::IsOfInteger(type) && ParseInteger(type, Trim(text), result);
     }
-}
-
-bool TValueText::Convert(const TCIMValue& value, TCIMValue::TCIMType type, TCIMValue& result)
-{
-    if (value.IsNull()) {
-        result = TCIMValue::Null(type);
-        return true;
-    }
-    const TType from = value.GetType();
-    if (TType::ECIMType(from) == type) {
-        result = value;
-        return true;
-    }
-    if (from.IsArray() || type.IsArray()) {
-        return from.IsArray() && type.IsArray() && ConvertArray(value, type, result);
-    }
-    if (TValueAccess::IsText(value)) {
-        const std::string_view text = TValueAccess::GetText(value);
-        return TType::ECIMType(type) == TType::kReference ? ConvertToPath(text, result) : Parse(type, text, result);
-    }
-    if (TType::ECIMType(type) == TType::kString) {
-        const bool hasText = TType::ECIMType(from) == TType::kChar16 || TType::ECIMType(from) == TType::kDateTime ||
-                             TType::ECIMType(from) == TType::kReference;
-        return hasText && Parse(type, value.ToText(), result);
-    }
-    return ConvertNumber(value, type, result);
 }
 
 const char* TValueText::GetTypeName(TCIMValue::TCIMType type) noexcept
@@ -347,7 +214,7 @@ void TValueText::AppendPlain(std::string& out, const TCIMValue& value)
         AppendReal(out, value.GetReal(), type == TType::kReal32);
         break;
     default:
-        if (IsSignedInteger(type)) {
+        if (TInteger::IsOfSigned(type)) {
             AppendSigned(out, value.GetSigned());
         } else {
             AppendUnsigned(out, value.GetUnsigned());
