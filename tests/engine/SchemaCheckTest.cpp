@@ -1,0 +1,135 @@
+#include "tests/engine/TPerClassFixture.h"
+
+namespace NORVZEL20 {
+namespace {
+
+std::string NotFound(const std::string& className, std::size_t index)
+{
+    return "0|TCIMDiffEngine: Schema do not match. (Couldn't find class " + className + " in namespace " + std::to_string(index) +
+           ")\n|";
+}
+
+// Card > Modem, declared where a test says; Disk everywhere.
+class SchemaCheckTest : public TPerClassFixture, public testing::WithParamInterface<EHost> {
+  protected:
+    SchemaCheckTest() : TPerClassFixture(GetParam())
+    {
+        Rules("<class name=\"Disk\" default=\"include\"/><class name=\"Card\" default=\"include\"/>");
+    }
+
+    void Card(std::size_t index) { Namespace(index).Class("Card", "", {TNamespaceBuilder::Key("Id")}).Class("Modem", "Card", {}); }
+};
+
+INSTANTIATE_TEST_SUITE_P(Hosts, SchemaCheckTest, testing::Values(EHost::kPlain, EHost::kInmem), testing::PrintToStringParamName());
+
+TEST_P(SchemaCheckTest, AMissingClassWithInstancesEndsTheRun)
+{
+    Card(0);
+    Card(1);
+    Namespace(2);
+    Namespace(0).Instance("Card", {{"Id", "a"}});
+    EXPECT_EQ("status 37\n", RecordsAfterRun());
+    EXPECT_EQ(NotFound("Card", 2), fLog.Take());
+}
+
+TEST_P(SchemaCheckTest, RecordsOfEarlierClassesStay)
+{
+    Disk(0, "sda", 1);
+    Card(0);
+    Namespace(0).Instance("Card", {{"Id", "a"}});
+    Namespace(1);
+    EXPECT_EQ("Disk\n  1 Disk.Bus=0,Id=\"sda\" [1]\nstatus 37\n", RecordsAfterRun());
+    EXPECT_EQ(NotFound("Card", 1), fLog.Take());
+}
+
+TEST_P(SchemaCheckTest, AMissingClassWithoutInstancesSkipsThatNamespace)
+{
+    Card(0);
+    Namespace(1);
+    Card(2);
+    Namespace(2).Instance("Card", {{"Id", "a"}});
+    EXPECT_EQ("Card\n  2 Card.Id=\"a\" [2]\n", RecordsAfterRun());
+    EXPECT_EQ("", fLog.Take());
+}
+
+TEST_P(SchemaCheckTest, SubclassesOfASkippedClassAreChecked)
+{
+    Card(0);
+    Namespace(0).Instance("Modem", {{"Id", "m"}});
+    Namespace(1);
+    EXPECT_EQ("status 37\n", RecordsAfterRun());
+    EXPECT_EQ(NotFound("Modem", 1), fLog.Take());
+}
+
+TEST_P(SchemaCheckTest, AClassOfWhichNothingIsComparedIsNotMissed)
+{
+    Card(0);
+    Namespace(0).Instance("Card", {{"Id", "a"}});
+    Namespace(1);
+    Rules("<class name=\"Disk\" default=\"include\"/>");
+    EXPECT_EQ("", RecordsAfterRun());
+    EXPECT_EQ("", fLog.Take());
+}
+
+TEST_P(SchemaCheckTest, AnotherFailureKeepsItsStatus)
+{
+    Card(0);
+    Card(1);
+    fComparison.GetWatch().FailCallsOf("ns1.GetClass(\"Card\")", TZELStatusCode::kNamespaceGone);
+    EXPECT_EQ("status 18\n", RecordsAfterRun());
+    EXPECT_EQ("", fLog.Take());
+}
+
+TEST_P(SchemaCheckTest, ClassesThatOnlyOthersHaveAreNotVisited)
+{
+    Namespace(0);
+    Card(1);
+    Namespace(1).Instance("Card", {{"Id", "a"}});
+    Rules("<class name=\"Disk\" default=\"include\"/>");
+    EXPECT_EQ("", RecordsAfterRun());
+    EXPECT_EQ(0u, fComparison.GetWatch().CountOf("Card"));
+}
+
+TEST_P(SchemaCheckTest, ClassesAreVisitedOnceParentsFirst)
+{
+    for (const std::size_t index : {0u, 1u}) {
+        Card(index);
+        Namespace(index)
+            .Class("FaxModem", "Modem", {})
+            .Class("Sound", "Card", {})
+            .Class("Last", "", {TNamespaceBuilder::Key("Id")});
+    }
+    Rules("<class name=\"Card\" default=\"include\"/><class name=\"Last\" default=\"include\"/>");
+    for (const std::string name : {"Last", "Sound", "FaxModem", "Modem", "Card"}) {
+        Namespace(0).Instance(name, {{"Id", name}});
+    }
+    EXPECT_EQ("Card\n  1 Card.Id=\"Card\" [1]\n"
+              "Modem\n  1 Modem.Id=\"Modem\" [1]\n"
+              "FaxModem\n  1 FaxModem.Id=\"FaxModem\" [1]\n"
+              "Sound\n  1 Sound.Id=\"Sound\" [1]\n"
+              "Last\n  1 Last.Id=\"Last\" [1]\n",
+              RecordsAfterRun());
+}
+
+TEST_P(SchemaCheckTest, AClassWithoutAPropertyListIsPassedOverToItsSubclasses)
+{
+    for (const std::size_t index : {0u, 1u}) {
+        Card(index);
+    }
+    Namespace(0).Instance("Card", {{"Id", "a"}}).Instance("Modem", {{"Id", "m"}});
+    Rules("<class name=\"Card\"/><class name=\"Modem\" default=\"include\"/>");
+    EXPECT_EQ("Modem\n  1 Modem.Id=\"m\" [1]\n", RecordsAfterRun());
+    EXPECT_EQ(0u, fComparison.GetWatch().CountOf("Card.EnumerateInstances"));
+}
+
+TEST_P(SchemaCheckTest, TheTreeIsTheReferences)
+{
+    Namespace(0).Class("Card", "", {TNamespaceBuilder::Key("Id")}).Class("Modem", "", {TNamespaceBuilder::Key("Id")});
+    Card(1);
+    Namespace(1).Instance("Modem", {{"Id", "m"}});
+    EXPECT_EQ("", RecordsAfterRun());
+    EXPECT_EQ(0u, fComparison.GetWatch().CountOf("ns1:Card.EnumerateSubClasses"));
+}
+
+}  // namespace
+}  // namespace NORVZEL20

@@ -1,0 +1,120 @@
+#include "tests/engine/TPerClassFixture.h"
+#include "tests/support/TPlainInstance.h"
+#include "tests/support/TPlainProperty.h"
+
+namespace NORVZEL20 {
+namespace {
+
+// With exactly two namespaces the reference is brought in line with the other one.
+class TwoNamespacesTest : public TPerClassFixture, public testing::WithParamInterface<EHost> {
+  protected:
+    TwoNamespacesTest() : TPerClassFixture(GetParam()) {}
+};
+
+INSTANTIATE_TEST_SUITE_P(Hosts, TwoNamespacesTest, testing::Values(EHost::kPlain, EHost::kInmem),
+                         testing::PrintToStringParamName());
+
+TEST_P(TwoNamespacesTest, TheReferenceTakesOverValues)
+{
+    Disk(0, "sda", 1);
+    Disk(1, "sda", 2);
+    EXPECT_EQ("Disk\n  4 Disk.Bus=0,Id=\"sda\" Size [1]\n", RecordsAfterRun());
+    EXPECT_EQ("Disk.Bus=0,Id=\"sda\" Bus=0 Id=\"sda\" Size=2 Label=NULL\n", Disks(0));
+    EXPECT_EQ(Disks(1), Disks(0));
+}
+
+TEST_P(TwoNamespacesTest, TheReferenceGetsCopiesOfInstancesItLacked)
+{
+    Disk(0, "sda", 1);
+    Disk(1, "sdb", 2);
+    Disk(1, "sda", 1);
+    Namespace(1).Instance("Disk", {{"Bus", 0u}, {"Id", "sdc"}, {"Label", "x"}});
+    RecordsAfterRun();
+    EXPECT_EQ("Disk.Bus=0,Id=\"sda\" Bus=0 Id=\"sda\" Size=1 Label=NULL\n"
+              "Disk.Bus=0,Id=\"sdb\" Bus=0 Id=\"sdb\" Size=2 Label=NULL\n"
+              "Disk.Bus=0,Id=\"sdc\" Bus=0 Id=\"sdc\" Size=NULL Label=\"x\"\n",
+              Disks(0));
+}
+
+TEST_P(TwoNamespacesTest, NullsAreNotCopied)
+{
+    Namespace(0);
+    Disk(1, "sda", 1);
+    RecordsAfterRun();
+    EXPECT_EQ(0u, fComparison.GetWatch().CountOf("ns0:new Disk.GetProperty(\"Label\")"));
+    EXPECT_EQ(1u, fComparison.GetWatch().CountOf("ns0:new Disk.Size.SetValue(1) {}"));
+}
+
+TEST_P(TwoNamespacesTest, WhatTheOtherLacksStaysAndIsMarked)
+{
+    Disk(0, "sda", 1);
+    Namespace(1);
+    RecordsAfterRun();
+    EXPECT_EQ("Disk.Bus=0,Id=\"sda\" Bus=0 Id=\"sda\" Size=1 Label=NULL\n", Disks(0));
+    EXPECT_EQ(3u, fComparison.GetWatch().CountOf(".MarkRemoved()"));
+    EXPECT_EQ(0u, fComparison.GetWatch().CountOf("Label.MarkRemoved()"));
+}
+
+TEST_P(TwoNamespacesTest, ASecondRunFindsOnlyWhatTheOtherLacks)
+{
+    Disk(0, "sda", 1);
+    Disk(0, "sdb", 1);
+    Disk(1, "sda", 2);
+    Disk(1, "sdc", 2);
+    const std::string first = RecordsAfterRun();
+    EXPECT_EQ(first + "Disk\n  1 Disk.Bus=0,Id=\"sdb\" [1]\n", RecordsAfterRun());
+}
+
+TEST_P(TwoNamespacesTest, AnExcludedKeyIsBroughtInLineLikeAnyProperty)
+{
+    Rules("<class name=\"Disk\" default=\"include\" excludekeys=\"Bus\"/>");
+    Disk(0, "sda", 1, 3);
+    Disk(1, "sda", 1, 4);
+    EXPECT_EQ("Disk\n  4 Disk.Id=\"sda\" Bus [1]\n", RecordsAfterRun());
+    EXPECT_EQ("Disk.Bus=3,Id=\"sda\" Bus=4 Id=\"sda\" Size=1 Label=NULL\n", Disks(0));
+}
+
+TEST_P(TwoNamespacesTest, OfSeveralWithOneKeyTheFirstIsCopied)
+{
+    Rules("<class name=\"Disk\" default=\"include\" excludekeys=\"Bus\"/>");
+    Namespace(0);
+    Disk(1, "sda", 1, 3);
+    Disk(1, "sda", 2, 4);
+    EXPECT_EQ("Disk\n  2 Disk.Id=\"sda\" [1 1]\n", RecordsAfterRun());
+    EXPECT_EQ("Disk.Bus=3,Id=\"sda\" Bus=3 Id=\"sda\" Size=1 Label=NULL\n", Disks(0));
+}
+
+TEST_P(TwoNamespacesTest, ALaterInstanceIsComparedWithWhatTheFirstOneLeft)
+{
+    Rules("<class name=\"Disk\" excludekeys=\"Bus\"><includelist><value>Size</value></includelist></class>");
+    Disk(0, "sda", 1, 3);
+    Disk(1, "sda", 2, 4);
+    Disk(1, "sda", 2, 5);
+    EXPECT_EQ("Disk\n  4 Disk.Id=\"sda\" Size [1]\n", RecordsAfterRun());
+}
+
+TEST_P(TwoNamespacesTest, APropertyThatTheReferenceLacksEndsTheCopy)
+{
+    fComparison.Namespace(0).Class("Card", "", {TNamespaceBuilder::Key("Id")});
+    fComparison.Namespace(1)
+        .Class("Card", "", {TNamespaceBuilder::Key("Id"), TNamespaceBuilder::Property("Speed")})
+        .Instance("Card", {{"Id", "a"}, {"Speed", "fast"}});
+    Rules("<class name=\"Card\" default=\"include\"/>");
+    EXPECT_EQ("Card\n  2 Card.Id=\"a\" [1]\nstatus 15\n", RecordsAfterRun());
+}
+
+TEST_P(TwoNamespacesTest, WithThreeTheReferenceIsLeftAsItIs)
+{
+    Disk(0, "sda", 1);
+    Disk(0, "sdb", 1);
+    Disk(1, "sda", 2);
+    Disk(1, "sdc", 2);
+    Namespace(2);
+    const std::string before = Disks(0);
+    RecordsAfterRun();
+    EXPECT_EQ(before, Disks(0));
+    EXPECT_EQ(0u, fComparison.GetWatch().CountOf("Mark") + fComparison.GetWatch().CountOf("ns0:new"));
+}
+
+}  // namespace
+}  // namespace NORVZEL20
