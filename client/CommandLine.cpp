@@ -56,8 +56,11 @@ class TCommandLine {
             return 0;
         }
         const std::vector<CLI::App*> chosen = fApp.get_subcommands();
-        console.Say("cimdelta: " + std::string(error.what()) + "; see cimdelta " +
-                    (chosen.empty() ? "" : chosen[0]->get_name() + " ") + "--help");
+        if (chosen.empty()) {
+            console.Say("cimdelta: name a command: compare, check, explain, query or show; see cimdelta --help");
+        } else {
+            console.Say("cimdelta: " + std::string(error.what()) + "; see cimdelta " + chosen[0]->get_name() + " --help");
+        }
         return kTrouble;
     }
 
@@ -80,16 +83,13 @@ class TCommandLine {
         command->add_option("--output", output, "write the result to this file, whole or not at all")->option_text("FILE");
     }
 
-    static void AddRules(CLI::App* command, std::string& rules, const char* option, const char* help)
-    {
-        command->add_option(option, rules, help)->option_text("RULES");
-    }
-
     static void AddSchemas(CLI::App* command, std::vector<std::string>& schemas)
     {
-        command->add_option("--schema", schemas, "inventories to be compared under the rules, the reference first")
+        command
+            ->add_option("--schema", schemas, "an inventory to be compared under the rules; repeated for each, the reference first")
             ->required()
-            ->option_text("INVENTORY...");
+            ->allow_extra_args(false)
+            ->option_text("INVENTORY");
     }
 
     void AddCompare()
@@ -98,7 +98,7 @@ class TCommandLine {
                                        [this](IConsole& console) { return RunCompare(fCompare, console); });
         command->add_option("REFERENCE", fCompare.reference, kInventoryHelp)->required()->option_text(" ");
         command->add_option("OTHER", fCompare.others, "compared with the reference, each")->required()->option_text("...");
-        AddRules(command, fCompare.rules, "--spec", "what to compare (everything)");
+        command->add_option("--spec", fCompare.rules, "the rules: what to compare (everything)")->option_text("RULES");
         AddFormat(command, fCompare.format);
         AddOutput(command, fCompare.output);
         command->add_flag("--strict-schema", fCompare.strictSchema, "declare nothing in inventories that lack what others declare");
@@ -108,7 +108,7 @@ class TCommandLine {
     {
         CLI::App* command = AddCommand("check", "what a rules file says and does, and what is odd about it",
                                        [this](IConsole& console) { return RunCheck(fCheck, console); });
-        AddRules(command->add_option_group("Rules"), fCheck.rules, "RULES", "the rules file");
+        command->add_option("RULES", fCheck.rules, "the rules file")->required()->option_text(" ");
         AddSchemas(command, fCheck.schemas);
         AddOutput(command, fCheck.output);
     }
@@ -118,7 +118,7 @@ class TCommandLine {
         CLI::App* command = AddCommand("explain", "which rule decides how a class or a property is compared",
                                        [this](IConsole& console) { return RunExplain(fExplain, console); });
         command->add_option("ELEMENT", fExplain.element, "CLASS or CLASS.PROPERTY")->required()->option_text(" ");
-        AddRules(command, fExplain.rules, "--spec", "the rules file");
+        command->add_option("--spec", fExplain.rules, "the rules file")->required()->option_text("RULES");
         AddSchemas(command, fExplain.schemas);
         AddOutput(command, fExplain.output);
     }

@@ -2,17 +2,17 @@
 
 #include <algorithm>
 
-#include "client/CimWalk.h"
 #include "client/CompleteInventories.h"
 #include "client/MadeRules.h"
-#include "client/OperatingSystem.h"
 #include "client/TClientError.h"
+#include "client/TComparisonFault.h"
 #include "client/TCoverageBuilder.h"
 #include "client/TDifferenceReader.h"
 #include "client/TLogCapture.h"
 #include "client/TProgress.h"
 #include "client/TTemporaryFile.h"
 #include "embedded/TAssertionFailure.h"
+#include "host/TAddToVectorCallback.h"
 #include "host/TNamespaceProviderManager.h"
 #include "host/TZELException.h"
 #include "provider/TDeltaNamespaceProvider.h"
@@ -22,6 +22,7 @@ namespace NORVZEL20 {
 namespace {
 
 const char kProviderName[] = "delta";
+const char kIndices[] = "NamespaceIndices";
 
 boost::shared_ptr<TDeltaNamespace> MakeDeltaNamespace()
 {
@@ -49,10 +50,28 @@ void KeepForever(const boost::shared_ptr<TDeltaNamespace>& records)
     fgKept.push_back(records);
 }
 
+// Takes a position off all records.
+void ForgetPosition(TDeltaNamespace& records, std::size_t position)
+{
+    std::vector<boost::shared_ptr<ICIMInstance>> deltas;
+    std::string language = "WQL";
+    std::string query = "SELECT * FROM KALMO_Delta";
+    records.ExecuteQuery(TAddToVectorCallback<ICIMInstance>(&deltas), language, query, TCallContext());
+    for (const boost::shared_ptr<ICIMInstance>& delta : deltas) {
+        std::vector<TCIMValue> indices = delta->GetProperty(kIndices, TCallContext())->GetValue(TCallContext()).GetElements();
+        indices.erase(std::remove_if(indices.begin(), indices.end(),
+                                     [position](const TCIMValue& index) { return index.GetUnsigned() == position; }),
+                      indices.end());
+        const TCIMValue kept(TCIMValue::TCIMType::kArrayUint16, static_cast<unsigned int>(indices.size()), indices);
+        records.ModifyInstance(delta->GetReference(TCallContext()), {{kIndices, kept}}, TCallContext());
+    }
+}
+
 }  // namespace
 
 TComparisonReport TComparison::Run(const std::string& rulesFile, bool strictSchema)
 {
+    fStrictSchema = strictSchema;
     if (!strictSchema) {
         fNotes = CompleteInventories(fInventories, fConsole);
     }
@@ -88,16 +107,21 @@ void TComparison::FindDifferences(TDeltaNamespace& records, TRules& rules)
     for (const TInventory& inventory : fInventories) {
         records.AddNamespaceToCompareList(inventory.ns);
     }
-    if (MustBeLeftAsItIs()) {
+    const bool twice = MustBeLeftAsItIs();
+    if (twice) {
         records.AddNamespaceToCompareList(fInventories.back().ns);
     }
     const TLogCapture log;
     try {
         records.FindDifferences();
     } catch (const TZELException& error) {
-        throw TClientError(DescribeFailure(log.GetMessages(), error.what(), rules));
+        throw TClientError(
+            TComparisonFault{error.GetStatusCode(), error.what(), log.GetMessages(), fStrictSchema}.Describe(fInventories, rules));
     } catch (const TAssertionFailure& error) {
-        throw TClientError(DescribeFailure(log.GetMessages(), error.what(), rules));
+        throw TClientError(std::string("the comparison failed: ") + error.what());
+    }
+    if (twice) {
+        ForgetPosition(records, fInventories.size());
     }
 }
 
@@ -108,39 +132,6 @@ bool TComparison::MustBeLeftAsItIs() const
     return fInventories.size() == 2 && std::any_of(fNotes.begin(), fNotes.end(), [](const TSchemaNote& note) {
                return note.kind == TSchemaNote::kTypeDiffers || note.kind == TSchemaNote::kKeysDiffer;
            });
-}
-
-std::string TComparison::DescribeFailure(const std::vector<std::string>& log, const std::string& reason, TRules& rules) const
-{
-    const std::string cause = "the comparison failed: " + (log.empty() ? reason : log.back());
-    if (!log.empty() && log.back().find("check Schema match") != std::string::npos) {
-        return cause + "; every inventory must declare " + kOperatingSystemClass + ", and " + fInventories[0].path +
-               " hold an instance of it with an OSType (without --strict-schema, cimdelta makes what is missing)";
-    }
-    const std::string undeclared = FindUndeclared(rules);
-    return undeclared.empty() ? cause : cause + "; " + undeclared + " (without --strict-schema, cimdelta declares it there)";
-}
-
-// What the rules ask for and an inventory lacks, the first one of it in the reference's order.
-std::string TComparison::FindUndeclared(TRules& rules) const
-{
-    for (const boost::shared_ptr<ICIMClass>& cls : AllClassesOf(*fInventories[0].ns)) {
-        const std::string& name = cls->GetName(TCallContext());
-        const std::vector<std::string> properties = rules.PropertiesOf(cls);
-        for (std::size_t i = 1; i < fInventories.size() && !properties.empty(); ++i) {
-            const boost::shared_ptr<TInMemClass> other = fInventories[i].ns->FindClass(name);
-            if (!other && fInventories[0].ns->FindClass(name)->GetInstanceCount() > 0) {
-                return fInventories[i].path + " does not declare class " + name + ", of which " + fInventories[0].path +
-                       " has instances";
-            }
-            for (const std::string& property : properties) {
-                if (other && other->GetInstanceCount() > 0 && !other->FindPropertyDecl(property)) {
-                    return fInventories[i].path + " does not declare property " + property + " of class " + name;
-                }
-            }
-        }
-    }
-    return std::string();
 }
 
 }  // namespace NORVZEL20

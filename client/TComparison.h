@@ -24,13 +24,12 @@ class TComparison {
   private:
     TComparisonReport RunWith(const std::string& rulesFile, const std::string& shownName);
     void FindDifferences(TDeltaNamespace& records, TRules& rules);
-    std::string DescribeFailure(const std::vector<std::string>& log, const std::string& reason, TRules& rules) const;
-    std::string FindUndeclared(TRules& rules) const;
     bool MustBeLeftAsItIs() const;
 
     std::vector<TInventory>& fInventories;
     IConsole& fConsole;
     std::vector<TSchemaNote> fNotes;
+    bool fStrictSchema = false;
 };
 
 }  // namespace NORVZEL20

@@ -5,10 +5,35 @@
 
 namespace NORVZEL20 {
 
+const char* const kCollectionTime = "DateTimeOfCollection";
+
 bool TCoverage::IsComplete() const
 {
+    return IsComplete(true);
+}
+
+bool TCoverage::IsCompleteButForTimes() const
+{
+    return IsComplete(false);
+}
+
+bool TCoverage::IsComplete(bool timesCount) const
+{
     return CountSharing() == 0 && std::all_of(classes.begin(), classes.end(),
-                                              [](const TClass& cls) { return cls.state == kCompared && cls.leftOut.empty(); });
+                                              [this, timesCount](const TClass& cls) { return IsWholeClass(cls, timesCount); });
+}
+
+bool TCoverage::IsWholeClass(const TClass& cls, bool timesCount) const
+{
+    if (cls.state == kOperatingSystemMade) {
+        // Nothing of an inventory is left out where none had an instance.
+        const auto made = std::count_if(notes.begin(), notes.end(),
+                                        [](const TSchemaNote& note) { return note.kind == TSchemaNote::kOperatingSystemMade; });
+        return static_cast<std::size_t>(made) == cls.instances.size();
+    }
+    return cls.state == kCompared && std::all_of(cls.leftOut.begin(), cls.leftOut.end(), [timesCount](const std::string& name) {
+               return !timesCount && name == kCollectionTime;
+           });
 }
 
 std::size_t TCoverage::CountClasses(EState state) const

@@ -8,6 +8,9 @@
 
 namespace NORVZEL20 {
 
+/// The property that tells when an inventory was collected.
+extern const char* const kCollectionTime;
+
 /// What a comparison looked at and what it did not, and why.
 struct TCoverage {
     enum EState {
@@ -33,12 +36,18 @@ struct TCoverage {
 
     /// Whether every instance of every inventory was compared in every property.
     bool IsComplete() const;
+    /// The same, but for the time of collection, which is never compared where the default is to include.
+    bool IsCompleteButForTimes() const;
     /// The classes of that state.
     std::size_t CountClasses(EState state) const;
     /// The instances of the compared classes in one inventory.
     std::size_t CountCompared(std::size_t inventory) const;
     /// Instances that share a key, over all classes and inventories.
     std::size_t CountSharing() const;
+
+  private:
+    bool IsWholeClass(const TClass& cls, bool timesCount) const;
+    bool IsComplete(bool timesCount) const;
 };
 
 }  // namespace NORVZEL20

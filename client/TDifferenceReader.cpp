@@ -80,10 +80,6 @@ TDifference TDifferenceReader::Make(const TDeltaRecord& record)
     difference.instance = record.instanceName;
     difference.property = record.property;
     difference.inventories = record.inventories;
-    // The last inventory may have been compared twice, under a position of its own.
-    difference.inventories.erase(
-        std::lower_bound(difference.inventories.begin(), difference.inventories.end(), fInventories.size()),
-        difference.inventories.end());
     boost::shared_ptr<ICIMInstance> instance;
     switch (record.type) {
     case TDeltaNamespace::kInstanceRemoved:

@@ -5,14 +5,12 @@
 #include "client/Counted.h"
 #include "client/DisplayText.h"
 #include "client/TClientError.h"
+#include "client/TCoverage.h"
 #include "embedded/TNameText.h"
 
 namespace NORVZEL20 {
 
 namespace {
-
-// The plug-in never compares it where the default is to include.
-const char kCollectionTime[] = "DateTimeOfCollection";
 
 const char* Verb(TCIMDiffEngine::propType treatment)
 {

@@ -43,19 +43,21 @@ std::string TTextFormat::Agreement() const
     if (fReport.coverage.CountClasses(TCoverage::kCompared) == 0) {
         return "Nothing was compared" + between + ".";
     }
-    return fReport.coverage.IsComplete() ? "No differences" + between + "."
-                                         : "No differences in what was compared" + between + "; not everything was, see below.";
+    if (fReport.coverage.IsCompleteButForTimes()) {
+        return "No differences" + between + (fReport.coverage.IsComplete() ? "." : ", times of collection aside.");
+    }
+    return "No differences in what was compared" + between + "; not everything was, see below.";
 }
 
 std::string TTextFormat::Kinds(const TComparisonReport::TCounts& counts) const
 {
     std::vector<std::string> kinds;
     if (counts.onlyInReference > 0) {
-        kinds.push_back(Counted(counts.onlyInReference, "instance") + (IsPair() ? " only in " : " missing from others than ") +
-                        Labels({0}));
+        kinds.push_back(Counted(counts.onlyInReference, "instance") +
+                        (IsPair() ? " only in " + Labels({0}) : " of " + Labels({0}) + " missing elsewhere"));
     }
     if (counts.onlyInOthers > 0) {
-        kinds.push_back(Counted(counts.onlyInOthers, "instance") + " only in " + (IsPair() ? Others() : "others"));
+        kinds.push_back(Counted(counts.onlyInOthers, "instance") + " only " + (IsPair() ? "in " + Others() : "elsewhere"));
     }
     if (counts.changedValues > 0) {
         kinds.push_back(Counted(counts.changedValues, "changed value") + " in " + Counted(counts.changedInstances, "instance"));

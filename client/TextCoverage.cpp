@@ -103,8 +103,9 @@ class TStatement {
             if (!counts.empty()) {
                 fOut += "Instances of " + EscapeForDisplay(cls.name) +
                         " that share their key with another one, since the rules leave out " +
-                        EscapeForDisplay(Join(cls.excludedKeys, ", ")) + ": " + Join(counts, ", ") + ". Of such instances of " +
-                        Label(0) + " only the first one was compared.\n";
+                        EscapeForDisplay(Join(cls.excludedKeys, ", ")) + ": " + Join(counts, ", ") +
+                        (cls.sharing[0] > 0 ? "; those of " + Label(0) + " were not compared.\n"
+                                            : "; each was compared with the same one.\n");
             }
         }
     }

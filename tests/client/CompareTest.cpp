@@ -1,0 +1,305 @@
+#include "tests/client/ClientTest.h"
+
+namespace NORVZEL20 {
+namespace {
+
+class CompareTest : public ClientTest {};
+
+const char kMadeForOther[] =
+    "cimdelta: other-schema.xml: has no instance of KALMO_OperatingSystem, which a comparison needs; one was made\n";
+
+TEST_F(CompareTest, APairIsToldWithOldAndNewValues)
+{
+    EXPECT_EQ("8 differences between web01 and web02: 2 instances only in web01, 2 instances only in web02, 4 changed values in 3 "
+              "instances\n"
+              "\n"
+              "INV_Disk\n"
+              "- BootId=1,Device=\"sda\"\n"
+              "+ BootId=7,Device=\"sda\"\n"
+              "\n"
+              "INV_Package\n"
+              "~ Name=\"bash\"\n"
+              "    Depends: {\"libc6\", \"libtinfo6\"} -> {\"libc6\", \"libtinfo6\", \"base-files\"}\n"
+              "    Version: 5.1 -> 5.2\n"
+              "+ Name=\"curl\"\n"
+              "~ Name=\"nginx\"\n"
+              "    Version: 1.22 -> 1.24\n"
+              "- Name=\"telnet\"\n"
+              "\n"
+              "INV_Service\n"
+              "~ Id=\"ssh\"\n"
+              "    Started: TRUE -> FALSE\n"
+              "\n"
+              "Compared: 4 classes; 6 instances of web01, 6 instances of web02.\n"
+              "1 class has no instances in any inventory.\n"
+              "Properties of KALMO_OperatingSystem not compared: DateTimeOfCollection.\n",
+              Result({"compare", "web01.xml", "web02.xml"}));
+    EXPECT_EQ(1, fStatus);
+}
+
+TEST_F(CompareTest, OfSeveralInventoriesEqualValuesStandTogether)
+{
+    EXPECT_EQ("10 differences between web01 and web02, web03: 2 instances of web01 missing elsewhere, 2 instances only elsewhere, "
+              "6 changed values in 3 instances\n"
+              "\n"
+              "INV_Disk\n"
+              "- BootId=1,Device=\"sda\"  (not in web02)\n"
+              "+ BootId=7,Device=\"sda\"  (in web02)\n"
+              "\n"
+              "INV_Package\n"
+              "~ Name=\"bash\"\n"
+              "    Depends: {\"libc6\", \"libtinfo6\"} -> web02: {\"libc6\", \"libtinfo6\", \"base-files\"}\n"
+              "    Version: 5.1 -> web02, web03: 5.2\n"
+              "+ Name=\"curl\"  (in web02, web03)\n"
+              "~ Name=\"nginx\"\n"
+              "    Section: web -> web03: \" web\"\n"
+              "    Version: 1.22 -> web02: 1.24 / web03: \"\"\n"
+              "- Name=\"telnet\"  (not in web02)\n"
+              "\n"
+              "INV_Service\n"
+              "~ Id=\"ssh\"\n"
+              "    Caption: Secure shell -> web03: \"Secure\\nshell \\u009b31m\"\n"
+              "    Started: TRUE -> web02: FALSE\n"
+              "\n"
+              "Compared: 4 classes; 6 instances of web01, 6 instances of web02, 7 instances of web03.\n"
+              "1 class has no instances in any inventory.\n"
+              "Properties of KALMO_OperatingSystem not compared: DateTimeOfCollection.\n",
+              Result({"compare", "web01.xml", "web02.xml", "web03.xml"}));
+    EXPECT_EQ(1, fStatus);
+}
+
+TEST_F(CompareTest, WhatIsEqualInAnotherOrderIsNoDifference)
+{
+    EXPECT_EQ("No differences between web01 and web01-again, times of collection aside.\n"
+              "\n"
+              "Compared: 4 classes; 6 instances of web01, 6 instances of web01-again.\n"
+              "1 class has no instances in any inventory.\n"
+              "Properties of KALMO_OperatingSystem not compared: DateTimeOfCollection.\n",
+              Result({"compare", "web01.xml", "web01-again.xml"}));
+    EXPECT_EQ(0, fStatus);
+}
+
+TEST_F(CompareTest, OrderInTheFilesDoesNotShowInTheReport)
+{
+    const std::string report = Result({"compare", "web01.xml", "web02.xml", "web03.xml"});
+    const std::string same = Shorten(Result({"compare", "web01-again.xml", "web02.xml", "web03.xml"}), "web01-again", "web01");
+    EXPECT_EQ(report, same);
+}
+
+TEST_F(CompareTest, EveryRunGivesTheSameBytes)
+{
+    const std::string first = Result({"compare", "-o", "json", "web01.xml", "web02.xml.gz", "web03.xml", "web02.xml.xz"});
+    for (int i = 0; i < 10; ++i) {
+        ASSERT_EQ(first, Result({"compare", "-o", "json", "web01.xml", "web02.xml.gz", "web03.xml", "web02.xml.xz"}));
+    }
+}
+
+TEST_F(CompareTest, CompressedInventoriesAreReadWhateverTheirNames)
+{
+    const std::string plain = Result({"compare", "web01.xml", "web02.xml"});
+    for (const char* suffix : {".gz", ".xz", ".zst"}) {
+        EXPECT_EQ(plain, Result({"compare", "web01.xml", std::string("web02.xml") + suffix}));
+        const std::string renamed = Scratch("web02.xml", ReadFile(std::string("web02.xml") + suffix));
+        Run({"compare", "-o", "ndjson", "web01.xml", renamed});
+        EXPECT_EQ(1, fStatus) << suffix << fErr;
+    }
+}
+
+TEST_F(CompareTest, RulesSayWhatCountsAndTheReportSaysSo)
+{
+    EXPECT_EQ("5 differences between web01 and web02: 1 instance only in web01, 1 instance only in web02, 3 changed values in 2 "
+              "instances\n"
+              "\n"
+              "INV_Package\n"
+              "~ Name=\"bash\"\n"
+              "    Depends: {\"libc6\", \"libtinfo6\"} -> {\"libc6\", \"libtinfo6\", \"base-files\"}\n"
+              "    Version: 5.1 -> 5.2\n"
+              "+ Name=\"curl\"\n"
+              "~ Name=\"nginx\"\n"
+              "    Version: 1.22 -> 1.24\n"
+              "- Name=\"telnet\"\n"
+              "\n"
+              "Compared: 2 classes; 4 instances of web01, 4 instances of web02.\n"
+              "1 class has no instances in any inventory.\n"
+              "Not compared, because the rules exclude every property: INV_Service (1 / 1), KALMO_OperatingSystem (1 / 1).\n"
+              "Properties of INV_Disk not compared: BootId.\n"
+              "Properties of INV_Package not compared: Size.\n",
+              Result({"compare", "--spec", "rules.xml", "web01.xml", "web02.xml"}));
+}
+
+TEST_F(CompareTest, NoDifferencesIsNotSaidOverWhatRulesLeaveOut)
+{
+    EXPECT_EQ("No differences in what was compared between web01 and web01-again; not everything was, see below.\n",
+              Result({"compare", "--spec", "rules.xml", "web01.xml", "web01-again.xml"}).substr(0, 98));
+    EXPECT_EQ(0, fStatus);
+}
+
+TEST_F(CompareTest, RulesThatCompareNothingAreToldAsSuch)
+{
+    const std::string rules = Scratch("none", "<DifftoolSpec/>");
+    EXPECT_EQ("Nothing was compared between web01 and web02.\n"
+              "\n"
+              "Compared: 0 classes; 0 instances of web01, 0 instances of web02.\n"
+              "1 class has no instances in any inventory.\n"
+              "Not compared, because the rules exclude every property: INV_Disk (1 / 1), INV_Package (3 / 3), INV_Service (1 / 1), "
+              "KALMO_OperatingSystem (1 / 1).\n",
+              Result({"compare", "--spec", rules, "web01.xml", "web02.xml"}));
+    EXPECT_EQ(0, fStatus);
+}
+
+TEST_F(CompareTest, InstancesThatShareAKeyAreTold)
+{
+    EXPECT_EQ(
+        "5 differences between web02 and two-boots: 3 instances only in web02, 1 instance only in two-boots, 1 changed value in 1 "
+        "instance\n"
+        "\n"
+        "INV_Disk\n"
+        "~ Device=\"sda\"\n"
+        "    SizeMB: 500 -> 900\n"
+        "+ Device=\"sdb\"\n"
+        "\n"
+        "INV_Package\n"
+        "- Name=\"bash\"\n"
+        "- Name=\"curl\"\n"
+        "- Name=\"nginx\"\n"
+        "\n"
+        "Compared: 2 classes; 4 instances of web02, 3 instances of two-boots.\n"
+        "1 class has no instances in any inventory.\n"
+        "Not compared, because the rules exclude every property: INV_Service (1 / 0), KALMO_OperatingSystem (1 / 1).\n"
+        "Properties of INV_Disk not compared: BootId.\n"
+        "Properties of INV_Package not compared: Size.\n"
+        "Instances of INV_Disk that share their key with another one, since the rules leave out BootId: 1 of two-boots; each was "
+        "compared with the same one.\n",
+        Result({"compare", "--spec", "rules.xml", "web02.xml", "two-boots.xml"}));
+    EXPECT_NE(std::string::npos, Result({"compare", "--spec", "rules.xml", "two-boots.xml", "web02.xml"})
+                                     .find("leave out BootId: 1 of two-boots; those of two-boots were not compared.\n"));
+}
+
+TEST_F(CompareTest, AnInstanceGoneUnderExcludedKeysIsFoundByItsPath)
+{
+    EXPECT_NE(std::string::npos,
+              Result({"compare", "--spec", "rules.xml", "two-boots.xml", "web02.xml"}).find("INV_Disk\n- Device=\"sdb\"\n\n"));
+}
+
+TEST_F(CompareTest, WhatAnotherInventoryDeclaresIsDeclaredAndTold)
+{
+    Run({"compare", "web01.xml", "other-schema.xml"});
+    EXPECT_EQ("6 differences between web01 and other-schema: 2 instances only in web01, 2 instances only in other-schema, 2 "
+              "changed values in 1 "
+              "instance\n"
+              "\n"
+              "ACME_OperatingSystem\n"
+              "+ CreationClassName=\"ACME_OperatingSystem\",Name=\"acme\"\n"
+              "\n"
+              "INV_Disk\n"
+              "- BootId=1,Device=\"sda\"\n"
+              "\n"
+              "INV_Extra\n"
+              "+ Serial=5\n"
+              "\n"
+              "INV_Package\n"
+              "~ Name=\"bash\"\n"
+              "    Depends: {\"libc6\", \"libtinfo6\"} -> NULL\n"
+              "    Vendor: NULL -> Debian\n"
+              "\n"
+              "INV_Service\n"
+              "- Id=\"ssh\"\n"
+              "\n"
+              "Compared: 5 classes; 5 instances of web01, 5 instances of other-schema.\n"
+              "2 classes have no instances in any inventory.\n"
+              "Not compared, because cimdelta made it: KALMO_OperatingSystem (1 / 1).\n"
+              "Declared in web01 as in other-schema: class CIM_OperatingSystem, class ACME_OperatingSystem, INV_Package.Vendor, "
+              "class INV_Extra.\n"
+              "Declared in other-schema as in web01: INV_Package.Depends, class INV_Disk, class INV_Element, class INV_Service.\n"
+              "Made in other-schema: an instance of KALMO_OperatingSystem.\n"
+              "Spelled in other-schema as in web01: INV_Package (was inv_package).\n"
+              "Spelled in other-schema as in web01: INV_Package.Version (was version).\n",
+              fOut);
+    EXPECT_EQ(kMadeForOther, fErr);
+    EXPECT_EQ(1, fStatus);
+}
+
+TEST_F(CompareTest, InventoriesWithoutOperatingSystemAreCompleteAllTheSame)
+{
+    Run({"compare", "other-schema.xml", "other-schema.xml"});
+    EXPECT_EQ("No differences between other-schema.xml and other-schema.xml#2.\n"
+              "\n"
+              "Compared: 3 classes; 5 instances of other-schema.xml, 5 instances of other-schema.xml#2.\n"
+              "1 class has no instances in any inventory.\n"
+              "Not compared, because cimdelta made it: KALMO_OperatingSystem (1 / 1).\n"
+              "Made in other-schema.xml: an instance of KALMO_OperatingSystem.\n"
+              "Made in other-schema.xml#2: an instance of KALMO_OperatingSystem.\n",
+              fOut);
+    EXPECT_EQ(std::string(kMadeForOther) + kMadeForOther, fErr);
+    EXPECT_EQ(0, fStatus);
+}
+
+TEST_F(CompareTest, TypesAndKeysThatDifferAreToldAndCompared)
+{
+    EXPECT_EQ("7 differences between web01 and other-types: 4 instances only in web01, 2 instances only in other-types, 1 changed "
+              "value in 1 "
+              "instance\n"
+              "\n"
+              "INV_Disk\n"
+              "- BootId=1,Device=\"sda\"\n"
+              "+ BootId=NULL,Device=\"sda\"\n"
+              "\n"
+              "INV_Package\n"
+              "~ Name=\"bash\"\n"
+              "    Size: uint64 100 -> uint32 100\n"
+              "- Name=\"nginx\"\n"
+              "- Name=\"telnet\"\n"
+              "+ Name=\"zsh\"\n"
+              "\n"
+              "INV_Service\n"
+              "- Id=\"ssh\"\n"
+              "\n"
+              "Compared: 4 classes; 6 instances of web01, 4 instances of other-types.\n"
+              "1 class has no instances in any inventory.\n"
+              "Properties of KALMO_OperatingSystem not compared: DateTimeOfCollection.\n"
+              "Declared in other-types as in web01: INV_Disk.BootId, class INV_Element, class INV_Service.\n"
+              "Of another type in other-types than in web01, so never equal: INV_Package.Size.\n"
+              "Identified by other keys in other-types than in web01: INV_Disk; instances match only under rules that exclude the "
+              "keys that "
+              "not both have.\n",
+              Result({"compare", "web01.xml", "other-types.xml"}));
+    EXPECT_EQ(std::string::npos,
+              Result({"compare", "-o", "cimxml", "web01.xml", "other-types.xml"}).find("<VALUE>1</VALUE><VALUE>2</VALUE>"));
+}
+
+TEST_F(CompareTest, AStrictSchemaIsTakenAsItIs)
+{
+    EXPECT_EQ("cimdelta: the comparison failed: TCIMDiffEngine: Failed to get all properties to check Schema match; "
+              "other-schema.xml declares no "
+              "class KALMO_OperatingSystem; without --strict-schema, cimdelta declares and makes what is missing\n",
+              Complaint({"compare", "--strict-schema", "web01.xml", "other-schema.xml"}));
+    EXPECT_EQ(
+        "cimdelta: the comparison failed: Type mismatch; property Size of class INV_Package is uint64 in web01.xml and uint32 in "
+        "other-types.xml; without --strict-schema, cimdelta declares and makes what is missing\n",
+        Complaint({"compare", "--strict-schema", "web01.xml", "other-types.xml"}));
+    EXPECT_EQ(
+        "cimdelta: the comparison failed: TCIMDiffEngine: Schema do not match. (Couldn't find class INV_Service in namespace 2); "
+        "other-types.xml does not declare class INV_Service, of which web01.xml has instances; without --strict-schema, cimdelta "
+        "declares "
+        "and makes what is missing\n",
+        Complaint({"compare", "--strict-schema", "web01.xml", "web02.xml", "other-types.xml"}));
+}
+
+TEST_F(CompareTest, AStrictSchemaThatFitsGivesTheSameReport)
+{
+    EXPECT_EQ(Result({"compare", "web01.xml", "web02.xml"}), Result({"compare", "--strict-schema", "web01.xml", "web02.xml"}));
+}
+
+TEST_F(CompareTest, ColourMarksTheKindOfADifference)
+{
+    fColored = true;
+    const std::string report = Result({"compare", "web01.xml", "web02.xml"});
+    EXPECT_NE(std::string::npos, report.find("\x1b[31m- Name=\"telnet\"\x1b[0m\n"));
+    EXPECT_NE(std::string::npos, report.find("\x1b[32m+ Name=\"curl\"\x1b[0m\n"));
+    EXPECT_NE(std::string::npos, report.find("\x1b[33m~ Name=\"bash\"\x1b[0m\n"));
+    fColored = false;
+    EXPECT_EQ(std::string::npos, Result({"compare", "web01.xml", "web02.xml"}).find('\x1b'));
+}
+
+}  // namespace
+}  // namespace NORVZEL20

@@ -1,0 +1,129 @@
+#include "tests/client/ClientTest.h"
+
+namespace NORVZEL20 {
+namespace {
+
+class RulesCommandsTest : public ClientTest {};
+
+TEST_F(RulesCommandsTest, CheckTellsElementsAndEffectiveRules)
+{
+    EXPECT_EQ("rules.xml: 2 elements, 0 warnings\n"
+              "\n"
+              "Elements:\n"
+              "  line 3: class INV_Package, default include\n"
+              "    line 5: exclude Size\n"
+              "  line 8: class INV_Disk, default include, excludekeys BootId\n"
+              "    line 10: exclude BootId\n"
+              "\n"
+              "Effective rules (classes with instances in web01.xml, or with an element):\n"
+              "  KALMO_OperatingSystem: not compared\n"
+              "  INV_Package: 4 of 5 properties compared, all but Size\n"
+              "  INV_Disk: 3 of 4 properties compared, all but BootId; matched without BootId\n"
+              "  INV_Service: not compared\n",
+              Result({"check", "rules.xml", "--schema", "web01.xml"}));
+    EXPECT_EQ(0, fStatus);
+}
+
+TEST_F(RulesCommandsTest, CheckWarnsOfWhatAnAuthorHardlyMeans)
+{
+    const std::string listing = Result({"check", "odd-rules.xml", "--schema", "web01.xml"});
+    EXPECT_EQ(
+        "Warnings:\n"
+        "  odd-rules.xml:3: the element for class INV_Service is read before that of its ancestor INV_Element (line 4), whose "
+        "default and lists "
+        "replace its own; put the ancestor first\n"
+        "  odd-rules.xml:9: class inv_disk is declared as INV_Disk; letter case counts in rules, so this element reaches no class "
+        "of that name\n"
+        "  odd-rules.xml:10: excluded key Bootid is no key of class INV_Disk\n"
+        "  odd-rules.xml:13: property size of class INV_Package is declared as Size; letter case counts in rules\n"
+        "  odd-rules.xml:17: property Version of class INV_Package is listed before in this element; the first listing counts\n"
+        "  odd-rules.xml:20: excludekeys of class INV_Package has no effect: the class already has an element at line 11; name the "
+        "keys there\n"
+        "  odd-rules.xml:21: this element for class INV_Package has no effect: the class's rules were complete before it (its "
+        "first element is at "
+        "line 11); put everything into one element\n",
+        listing.substr(listing.find("Warnings:")));
+    EXPECT_EQ(0, fStatus);
+}
+
+TEST_F(RulesCommandsTest, CheckTellsExcludedKeysThatComeTooLate)
+{
+    const std::string rules = Scratch("late", "<DifftoolSpec>\n<class name='INV_Element' default='include'/>\n"
+                                              "<class name='INV_Service' default='include' excludekeys='Id'/>\n</DifftoolSpec>");
+    const std::string listing = Shorten(Result({"check", rules, "--schema", "web01.xml"}), rules, "R");
+    EXPECT_EQ("Warnings:\n"
+              "  R:3: excludekeys of class INV_Service has no effect: the class already has the rules of its ancestor INV_Element "
+              "(line 2); put this element "
+              "before that one\n",
+              listing.substr(listing.find("Warnings:")));
+}
+
+TEST_F(RulesCommandsTest, CheckTellsRulesThatMatchedNothing)
+{
+    const std::string listing = Result({"check", "rules.xml", "--schema", "empty-classes.xml"});
+    EXPECT_EQ("Rules that matched nothing:\n"
+              "  rules.xml:3: class INV_Package has no instances, nor has any class below it\n"
+              "  rules.xml:8: class INV_Disk has no instances, nor has any class below it\n",
+              listing.substr(listing.find("Rules that matched")));
+}
+
+TEST_F(RulesCommandsTest, ASecondSchemaDeclaresWhatTheFirstLacks)
+{
+    const std::string rules = Scratch("extra", "<DifftoolSpec><class name='INV_Extra' default='include'/></DifftoolSpec>");
+    EXPECT_EQ(2, (Run({"check", rules, "--schema", "web01.xml"}), fStatus));
+    Run({"check", rules, "--schema", "web01.xml", "--schema", "other-schema.xml"});
+    EXPECT_EQ(0, fStatus);
+    EXPECT_NE(std::string::npos, fOut.find("  INV_Extra: 2 of 2 properties compared\n"));
+}
+
+TEST_F(RulesCommandsTest, ExplainNamesTheRuleThatDecides)
+{
+    const struct {
+        const char* element;
+        const char* explanation;
+    } rows[] = {
+        {"INV_Package.Version", "INV_Package.Version: compared, by default, rules.xml:3 (element for class INV_Package)\n"},
+        {"INV_Package.Size",
+         "INV_Package.Size: not compared, excluded by the list at rules.xml:5 (element for class INV_Package)\n"},
+        {"inv_package.SIZE",
+         "INV_Package.Size: not compared, excluded by the list at rules.xml:5 (element for class INV_Package)\n"},
+        {"INV_Service.Id", "INV_Service.Id: not compared, by default, since no element is for this class or one above it\n"},
+        {"INV_Disk", "INV_Disk: compared; default include, rules.xml:8 (element for class INV_Disk)\n"
+                     "  matched without BootId (excludekeys, rules.xml:8)\n"
+                     "  Device: compared, by default, rules.xml:8 (element for class INV_Disk)\n"
+                     "  BootId: not compared, excluded by the list at rules.xml:10 (element for class INV_Disk)\n"
+                     "  SizeMB: compared, by default, rules.xml:8 (element for class INV_Disk)\n"
+                     "  Model: compared, by default, rules.xml:8 (element for class INV_Disk)\n"},
+    };
+    for (const auto& row : rows) {
+        EXPECT_EQ(row.explanation, Result({"explain", row.element, "--spec", "rules.xml", "--schema", "web01.xml"}));
+        EXPECT_EQ(0, fStatus);
+    }
+}
+
+TEST_F(RulesCommandsTest, ExplainFollowsInheritanceAndOrder)
+{
+    EXPECT_EQ("INV_Service.Caption: compared, included by the list at odd-rules.xml:6 (element for class INV_Element)\n",
+              Result({"explain", "INV_Service.Caption", "--spec", "odd-rules.xml", "--schema", "web01.xml"}));
+    EXPECT_EQ("INV_Package.Version: not compared, excluded by the list at odd-rules.xml:14 (element for class INV_Package)\n",
+              Result({"explain", "INV_Package.Version", "--spec", "odd-rules.xml", "--schema", "web01.xml"}));
+}
+
+TEST_F(RulesCommandsTest, ExplainKnowsWhatIsNeverCompared)
+{
+    const std::string rules = Scratch("os", "<DifftoolSpec><class name='KALMO_OperatingSystem' default='include'/></DifftoolSpec>");
+    EXPECT_EQ("KALMO_OperatingSystem.DateTimeOfCollection: not compared, the time of collection never is where the default is to "
+              "include\n",
+              Result({"explain", "KALMO_OperatingSystem.DateTimeOfCollection", "--spec", rules, "--schema", "web01.xml"}));
+}
+
+TEST_F(RulesCommandsTest, WhatIsNotDeclaredCannotBeExplained)
+{
+    EXPECT_EQ("cimdelta: web01.xml: declares no class Nix; cimdelta show web01.xml lists those it declares\n",
+              Complaint({"explain", "Nix", "--spec", "rules.xml", "--schema", "web01.xml"}));
+    EXPECT_EQ("cimdelta: web01.xml: class INV_Disk has no property Nix; cimdelta explain INV_Disk lists those it has\n",
+              Complaint({"explain", "INV_Disk.Nix", "--spec", "rules.xml", "--schema", "web01.xml"}));
+}
+
+}  // namespace
+}  // namespace NORVZEL20
