@@ -15,7 +15,7 @@ class TCimXmlAttributes {
     const char* Find(const char* name) const noexcept
     {
         for (const char** next = fAttributes; *next != nullptr; next += 2)
-            if (std::strcmp(next[0], name) == 0)
+            if (*next[0] == *name && std::strcmp(next[0], name) == 0)  // mostly the first character decides
                 return next[1];
         return nullptr;
     }

@@ -22,6 +22,8 @@ class TCimXmlDraftBuilder {
     TCimXmlDraft Take();
 
     void BeginProperty(const char* name, const TCimXmlAttributes& attributes);
+    /// Of the property that is open; valid until it ends.
+    const std::string& GetPropertyName() const noexcept { return fProperty->fName; }
     void EndProperty(TCIMValue value);
     void BeginMethod(const char* name, TCIMValue::TCIMType type, const TCimXmlAttributes& attributes);
     void EndMethod();

@@ -48,6 +48,7 @@ class TCimXmlElement {
         kParamValue,
         kProperty,
         kPropertyArray,
+        kPropertyRefArray,
         kPropertyReference,
         kQualifier,
         kQualifierDeclaration,

@@ -164,10 +164,11 @@ TCimXmlLoader::TTarget TCimXmlLoader::FindProperty(std::string_view name)
         fContext.Fail(EStatus::kParseError, "found property " + Quote(name) + " a second time in one instance");
     fLayout->given[slot] = fNumber;
     fExpected = fLayout->positions[slot] + 1;
-    return {slot, cls.GetSlotDecl(slot).GetType(), fLayout->embedded[slot]};
+    const TInMemPropertyDecl& decl = cls.GetSlotDecl(slot);
+    return {&decl.GetName(), slot, decl.GetType(), fLayout->embedded[slot]};
 }
 
-void TCimXmlLoader::SetProperty(const TTarget& target, TCIMValue value, bool metUnknownClass)
+void TCimXmlLoader::SetProperty(const TTarget& target, TCIMValue&& value, bool metUnknownClass)
 {
     if (value.GetType() != target.type)
         value = Convert(target, value);
@@ -215,10 +216,10 @@ void TCimXmlLoader::FillKeys(const TOwnKeys& keys)
         const std::uint32_t slot = fLayout->cls->FindSlot(name);
         if (slot == TInMemClass::kNoSlot || fLayout->given[slot] == fNumber)
             continue;
-        const TCIMValue::TCIMType type = fLayout->cls->GetSlotDecl(slot).GetType();
+        const TInMemPropertyDecl& decl = fLayout->cls->GetSlotDecl(slot);
         TCIMValue converted = value;
-        TValueText::Convert(value, type, converted);  // where it cannot be, setting it says so
-        SetProperty({slot, type, false}, std::move(converted), false);
+        TValueText::Convert(value, decl.GetType(), converted);  // where it cannot be, setting it says so
+        SetProperty({&decl.GetName(), slot, decl.GetType(), false}, std::move(converted), false);
         fContext.Tolerate("key from name", "an instance of class " + Quote(fLayout->cls->GetName()) + " leaves out its key " +
                                                Quote(name) + "; taken from the name in front of it");
     }
@@ -254,7 +255,7 @@ void TCimXmlLoader::AddWaiting(const TCimXmlDraft& draft)
     for (std::size_t index = 0; index < object.GetProperties().size(); ++index) {
         const TCimXmlContext::TAt atProperty(fContext, draft.propertyPlaces[index]);
         const TEmbeddedObject::TProperty& property = object.GetProperties()[index];
-        SetProperty(FindProperty(property.fName), property.fValue, true);
+        SetProperty(FindProperty(property.fName), TCIMValue(property.fValue), true);
     }
     EndInstance(&draft.ownKeys);
 }

@@ -28,9 +28,10 @@ class TCimXmlLoader {
 
     /// A property of the instance being filled.
     struct TTarget {
+        const std::string* name;  ///< as declared
         std::uint32_t slot;
         TCIMValue::TCIMType type;
-        bool isEmbedded;  ///< whether text is an embedded object
+        bool isEmbedded;  ///< whether text may be an embedded object, as the declaration says
     };
 
     TCimXmlLoader(TCimXmlContext& context, boost::shared_ptr<TInMemNamespace> ns);
@@ -42,7 +43,7 @@ class TCimXmlLoader {
     bool BeginInstance(const char* className);
     TTarget FindProperty(std::string_view name);
     /// `metUnknownClass` tells that the value refers to a class that is not known yet.
-    void SetProperty(const TTarget& target, TCIMValue value, bool metUnknownClass);
+    void SetProperty(const TTarget& target, TCIMValue&& value, bool metUnknownClass);
     /// `ownKeys` (may be null) fills the keys that the instance itself does not tell.
     void EndInstance(const TOwnKeys* ownKeys);
     void AddInstance(TCimXmlDraft draft);

@@ -1,6 +1,8 @@
 #include "embedded/TCimXmlReader.h"
 
+#include <algorithm>
 #include <boost/smart_ptr/make_shared.hpp>
+#include <cstring>
 #include <utility>
 
 #include "embedded/TValueText.h"
@@ -17,6 +19,11 @@ constexpr std::size_t kMaxEmbeddedDepth = 32;
 std::string Quote(std::string_view text)
 {
     return TCimXmlContext::Quote(text);
+}
+
+bool IsBlank(char c)
+{
+    return c == ' ' || c == '\n' || c == '\t' || c == '\r';
 }
 
 bool IsMarkedEmbedded(const TCimXmlAttributes& attributes)
@@ -105,10 +112,9 @@ void TCimXmlReader::CheckBlank() const
 {
     if (fText.empty() || TTable::TakesText(GetState()))
         return;
-    const std::size_t start = fText.find_first_not_of(" \t\r\n");
-    if (start != std::string_view::npos)
-        fContext.Fail(EStatus::kParseError, "found text " + Quote(fText.substr(start)) + " in <" +
-                                                TElement::GetName(fOpen.back().element) + ">, expected elements alone");
+    if (!std::all_of(fText.begin(), fText.end(), IsBlank))
+        fContext.Fail(EStatus::kParseError, "found text " + Quote(fText) + " in <" + TElement::GetName(fOpen.back().element) +
+                                                ">, expected elements alone");
 }
 
 const char* TCimXmlReader::Require(const TCimXmlAttributes& attributes, const char* name) const
@@ -132,11 +138,7 @@ void TCimXmlReader::Begin(TTable::EAction action, const TCimXmlAttributes& attri
 {
     switch (action) {
     case TTable::kBeginProperty:
-        return BeginProperty(attributes, ReadType(Require(attributes, "TYPE")), false);
-    case TTable::kBeginPropertyArray:
-        return BeginProperty(attributes, ReadType(Require(attributes, "TYPE")).GetArrayType(), true);
-    case TTable::kBeginPropertyReference:
-        return BeginProperty(attributes, TType::kReference, false);
+        return BeginProperty(attributes);
     case TTable::kBeginText:
         return BeginValue();
     case TTable::kBeginArray:
@@ -194,7 +196,7 @@ void TCimXmlReader::End(TTable::EAction action)
 {
     switch (action) {
     case TTable::kEndText:
-        return AddValue(MakeValue(fText));
+        return EndText();
     case TTable::kEndProperty:
         return EndProperty();
     case TTable::kEndArray:
@@ -204,7 +206,7 @@ void TCimXmlReader::End(TTable::EAction action)
     case TTable::kEndObject:
         return EndObject();
     case TTable::kEndReference:
-        return AddValue(TCIMValue(fPaths.End()));
+        return EndReference();
     case TTable::kEndKeyValue:
         return fPaths.EndKeyValue(fText);
     case TTable::kEndHost:
@@ -303,34 +305,52 @@ void TCimXmlReader::EndInstance()
     fLoader->AddInstance(std::move(draft));
 }
 
-void TCimXmlReader::BeginItem(TItem& item, const char* name, TType type)
+void TCimXmlReader::BeginItem(TItem& item, std::string_view name, TType type)
 {
     item.name = name;
     item.type = type;
-    item.isEmbedded = false;
+    item.text = TItem::kPlain;
     item.isGiven = false;
     fItem = &item;
 }
 
-void TCimXmlReader::BeginProperty(const TCimXmlAttributes& attributes, TType type, bool isArray)
+void TCimXmlReader::BeginProperty(const TCimXmlAttributes& attributes)
 {
     const char* name = Require(attributes, "NAME");
-    BeginItem(fProperty, name, type);
-    fMetUnknownClass = false;
     if (fDirect)
         fTarget = fLoader->FindProperty(name);
     else
         fDraft.BeginProperty(name, attributes);
-    if (type == (isArray ? TType::kArrayString : TType::kString))
-        fProperty.isEmbedded = (fDirect && fTarget.isEmbedded) || IsMarkedEmbedded(attributes);
+    BeginItem(fProperty, fDirect ? *fTarget.name : fDraft.GetPropertyName(), ReadPropertyType(attributes));
+    if (fProperty.type.GetElementType() != TType::kString)
+        return;
+    if (IsMarkedEmbedded(attributes))
+        fProperty.text = TItem::kObject;
+    else if (fDirect && fTarget.isEmbedded)
+        fProperty.text = TItem::kPerhapsObject;
+}
+
+/// The type that the element tells; looked up only where it is not the declared one.
+TType TCimXmlReader::ReadPropertyType(const TCimXmlAttributes& attributes) const
+{
+    const TElement::EElement element = fOpen.back().element;
+    if (element == TElement::kPropertyReference)
+        return TType::kReference;
+    if (element == TElement::kPropertyRefArray)
+        return TType::kArrayReference;
+    const char* text = Require(attributes, "TYPE");
+    const bool isDeclared = fDirect && std::strcmp(text, TValueText::GetTypeName(fTarget.type)) == 0;
+    const TType type = isDeclared ? fTarget.type.GetElementType() : ReadType(text);
+    return element == TElement::kPropertyArray ? type.GetArrayType() : type;
 }
 
 void TCimXmlReader::EndProperty()
 {
-    TCIMValue value = TakeValue(fProperty);
     if (!fDirect)
-        return fDraft.EndProperty(std::move(value));
-    fLoader->SetProperty(fTarget, std::move(value), fMetUnknownClass);
+        return fDraft.EndProperty(TakeValue(fProperty));
+    if (!fProperty.value.IsNull())
+        fLoader->SetProperty(fTarget, std::move(fProperty.value), fPaths.TakeMetUnknownClass());
+    fProperty.value = TCIMValue();
 }
 
 void TCimXmlReader::BeginMethod(const TCimXmlAttributes& attributes)
@@ -350,7 +370,8 @@ void TCimXmlReader::BeginParameter(const TCimXmlAttributes& attributes)
 
 void TCimXmlReader::BeginQualifier(const TCimXmlAttributes& attributes)
 {
-    BeginItem(fQualifier, Require(attributes, "NAME"), ReadType(Require(attributes, "TYPE")));
+    fQualifierName = Require(attributes, "NAME");
+    BeginItem(fQualifier, fQualifierName, ReadType(Require(attributes, "TYPE")));
     fFlavor = TCimXmlDraftBuilder::ReadFlavor(attributes);
     fPropagated = attributes.IsTrue("PROPAGATED", false);
 }
@@ -362,13 +383,14 @@ void TCimXmlReader::EndQualifier()
     if (fDirect)
         return fContext.Tolerate("qualifier of an instance",
                                  "qualifier " + Quote(fQualifier.name) + " stands on an instance or its property; left out");
-    fDraft.AddQualifier({fQualifier.name, std::move(value), fFlavor, fPropagated});
+    fDraft.AddQualifier({fQualifierName, std::move(value), fFlavor, fPropagated});
 }
 
 void TCimXmlReader::BeginQualifierDecl(const TCimXmlAttributes& attributes)
 {
     const TType type = ReadType(Require(attributes, "TYPE"));
-    BeginItem(fQualifier, Require(attributes, "NAME"), attributes.IsTrue("ISARRAY", false) ? type.GetArrayType() : type);
+    fQualifierName = Require(attributes, "NAME");
+    BeginItem(fQualifier, fQualifierName, attributes.IsTrue("ISARRAY", false) ? type.GetArrayType() : type);
     fFlavor = TCimXmlDraftBuilder::ReadFlavor(attributes);
     fScope = 0;
 }
@@ -388,7 +410,7 @@ void TCimXmlReader::ReadScope(const TCimXmlAttributes& attributes)
 void TCimXmlReader::EndQualifierDecl()
 {
     TCimXmlQualifierDraft draft;
-    draft.name = fQualifier.name;
+    draft.name = fQualifierName;
     draft.value = TakeValue(fQualifier);
     draft.scope = ICIMQualifierDecl::EScope(fScope);
     draft.flavor = fFlavor;
@@ -416,18 +438,26 @@ void TCimXmlReader::BeginValue()
     fItem->isGiven = true;
 }
 
-/// A value has ended; what it belongs to is the innermost element that is open now.
-void TCimXmlReader::AddValue(TCIMValue value)
+/// What a value belongs to is the innermost element that is open when it has ended.
+void TCimXmlReader::EndText()
 {
+    if (GetState() != TTable::kArray)
+        return MakeValue(fText, fItem->value);
+    fElements.emplace_back();
+    MakeValue(fText, fElements.back());
+}
+
+void TCimXmlReader::EndReference()
+{
+    TCIMValue path(fPaths.End());
     switch (GetState()) {
-    case TTable::kArray:
     case TTable::kReferenceArray:
-        return fElements.push_back(std::move(value));
+        return fElements.push_back(std::move(path));
     case TTable::kKeyBinding:
     case TTable::kInstanceName:
-        return fPaths.AddKey(std::move(value));
+        return fPaths.AddKey(std::move(path));
     default:
-        fItem->value = std::move(value);
+        fItem->value = std::move(path);
     }
 }
 
@@ -445,16 +475,24 @@ TCIMValue TCimXmlReader::TakeValue(TItem& item)
     return value;
 }
 
-TCIMValue TCimXmlReader::MakeValue(std::string_view text)
+void TCimXmlReader::MakeValue(std::string_view text, TCIMValue& value)
 {
     const TType type = fItem->type.GetElementType();
     if (type == TType::kString)
-        return fItem->isEmbedded && !text.empty() ? MakeObject(text) : fContext.GetTexts().MakeValue(text);
-    TCIMValue value;
-    if (!TValueText::Parse(type, text, value))
+        value = IsObject(text) ? MakeObject(text) : fContext.GetTexts().MakeValue(text);
+    else if (!TValueText::Parse(type, text, value))
         fContext.Fail(EStatus::kTypeMismatch, "found " + Quote(text) + " as value of " + Quote(fItem->name) + ", expected a " +
                                                   TValueText::GetTypeName(type));
-    return value;
+}
+
+/// Whether the text is that of an embedded object. Writers that do not mark those write plain text into their properties too.
+bool TCimXmlReader::IsObject(std::string_view text) const
+{
+    if (fItem->text == TItem::kPerhapsObject) {
+        const auto start = std::find_if_not(text.begin(), text.end(), IsBlank);
+        return start != text.end() && *start == '<';
+    }
+    return fItem->text == TItem::kObject && !text.empty();
 }
 
 TCIMValue TCimXmlReader::MakeObject(std::string_view text)

@@ -47,9 +47,11 @@ class TCimXmlReader : public TXmlReader::ISink {
 
     /// What has a value: a property, a qualifier or a qualifier's declaration.
     struct TItem {
-        std::string name;
+        enum EText { kPlain, kObject, kPerhapsObject };
+
+        std::string_view name;  // kept by whoever declares it, for a qualifier in fQualifierName
         TCIMValue::TCIMType type = TCIMValue::TCIMType::kNone;
-        bool isEmbedded = false;
+        EText text = kPlain;
         bool isGiven = false;
         TCIMValue value;
     };
@@ -72,7 +74,8 @@ class TCimXmlReader : public TXmlReader::ISink {
     void EndClass();
     void BeginInstance(const TCimXmlAttributes& attributes);
     void EndInstance();
-    void BeginProperty(const TCimXmlAttributes& attributes, TCIMValue::TCIMType type, bool isArray);
+    void BeginProperty(const TCimXmlAttributes& attributes);
+    TCIMValue::TCIMType ReadPropertyType(const TCimXmlAttributes& attributes) const;
     void EndProperty();
     void BeginMethod(const TCimXmlAttributes& attributes);
     void BeginParameter(const TCimXmlAttributes& attributes);
@@ -84,11 +87,13 @@ class TCimXmlReader : public TXmlReader::ISink {
     void ReadError(const TCimXmlAttributes& attributes) const;
     void NoteSkipped();
 
-    void BeginItem(TItem& item, const char* name, TCIMValue::TCIMType type);
+    void BeginItem(TItem& item, std::string_view name, TCIMValue::TCIMType type);
     void BeginValue();
-    void AddValue(TCIMValue value);
+    void EndText();
+    void EndReference();
     void EndArray();
-    TCIMValue MakeValue(std::string_view text);
+    void MakeValue(std::string_view text, TCIMValue& value);
+    bool IsObject(std::string_view text) const;
     TCIMValue MakeObject(std::string_view text);
     TCIMValue TakeValue(TItem& item);
 
@@ -101,12 +106,12 @@ class TCimXmlReader : public TXmlReader::ISink {
     std::string_view fText;
     TItem fProperty;
     TItem fQualifier;
+    std::string fQualifierName;
     TItem* fItem = nullptr;
     std::vector<TCIMValue> fElements;
-    TCimXmlLoader::TTarget fTarget{0, TCIMValue::TCIMType::kNone, false};
+    TCimXmlLoader::TTarget fTarget{nullptr, 0, TCIMValue::TCIMType::kNone, false};
     bool fDirect = false;       // the instance is filled without a draft
     bool fObjectGiven = false;  // the VALUE.OBJECT that is open has had its class or instance
-    bool fMetUnknownClass = false;
     ICIMQualifierDecl::EFlavor fFlavor = ICIMQualifierDecl::kFlavorDefault;
     unsigned int fScope = 0;
     bool fPropagated = false;

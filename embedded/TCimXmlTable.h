@@ -71,8 +71,6 @@ class TCimXmlTable {
         kBeginInstance,
         kEndInstance,
         kBeginProperty,
-        kBeginPropertyArray,
-        kBeginPropertyReference,
         kEndProperty,
         kBeginMethod,
         kEndMethod,

@@ -4,6 +4,7 @@
 #include <boost/smart_ptr/shared_ptr.hpp>
 #include <string>
 #include <string_view>
+#include <vector>
 
 #include "host/ICIMClass.h"
 #include "host/ICIMInstance.h"
@@ -13,10 +14,9 @@ namespace NORVZEL20 {
 
 /// Writes a namespace as CIM-XML (DSP0201), so that loading the document gives an equal namespace.
 ///
-/// Text reaches the sink in pieces of some 64 KiB, in UTF-8; nothing is held beyond that. Characters that XML readers would change
-/// (carriage return, tab, line feed) are written as character references. Output depends on the namespace's contents alone.
-/// A control character that XML 1.0 cannot carry is written as U+FFFD.
-/// Errors: what the sink or the namespace throws.
+/// Text reaches the sink in pieces of some 64 KiB, in UTF-8; nothing is held beyond that. What XML readers would change is
+/// written as a character reference; a control character that XML 1.0 cannot carry becomes U+FFFD. Output depends on the contents
+/// of the namespace alone. Errors: what the sink or the namespace throws.
 class TCimXmlWriter {
   public:
     using TSink = boost::function<void(std::string_view)>;
@@ -42,6 +42,7 @@ class TCimXmlWriter {
     static std::string InstanceToXml(const ICIMInstance& instance);
 
   private:
+    static std::vector<boost::shared_ptr<ICIMClass>> CollectClasses(ICIMNamespace& ns);
     void Flush();
     void FlushWhenFull();
 

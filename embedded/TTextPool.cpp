@@ -2,6 +2,7 @@
 
 #include <cstdint>
 #include <cstring>
+#include <utility>
 
 #include "embedded/TValueAccess.h"
 
@@ -31,10 +32,16 @@ TCIMValue TTextPool::MakeValue(std::string_view text)
 {
     if (text.size() <= TValueAccess::kShortTextSize || text.size() > kLongest)
         return TCIMValue::FromText(text);
-    TSharedText::TPointer& known = fTexts[HashOf(text) >> 52];
-    if (!known || known->GetText() != text)
-        known = TSharedText::Create(text);
-    return TValueAccess::FromSharedText(known);
+    const std::uint64_t hash = HashOf(text);
+    const auto mark = static_cast<std::uint32_t>(hash);
+    TBucket& bucket = fBuckets[hash >> 54];
+    if (bucket.hash == mark && bucket.text && bucket.text->GetText() == text)
+        return TValueAccess::FromSharedText(bucket.text);
+    if (std::exchange(bucket.last, mark) != mark)
+        return TCIMValue::FromText(text);
+    bucket.text = TSharedText::Create(text);
+    bucket.hash = mark;
+    return TValueAccess::FromSharedText(bucket.text);
 }
 
 }  // namespace NORVZEL20
