@@ -43,7 +43,12 @@ void TDeltaNamespace::SetSpecFileName(std::string name)
 void TDeltaNamespace::AddNamespaceToCompareList(boost::shared_ptr<ICIMNamespace> ns)
 {
     fCompareList.push_back(std::move(ns));
-    fClassCache.emplace_back();
+    try {
+        fClassCache.emplace_back();
+    } catch (...) {
+        fCompareList.pop_back();  // both grow, or neither
+        throw;
+    }
 }
 
 unsigned short TDeltaNamespace::NumContainers() const
