@@ -7,6 +7,7 @@
 
 #include <algorithm>
 #include <climits>
+#include <cstring>
 #include <new>
 #include <utility>
 
@@ -50,8 +51,12 @@ struct TXmlReader::TCallbacks {
         Guarded(user, [=](TXmlReader& reader) {
             if (++reader.fDepth > kMaxDepth)
                 return reader.Refuse("elements are nested too deeply");
+            if (static_cast<std::size_t>(XML_GetCurrentByteCount(reader.fParser.get())) > kMaxTokenLength)
+                return reader.Refuse("a tag is too long");
             if (CountAttributes(attributes) > kMaxAttributes)
                 return reader.Refuse("too many attributes");
+            if (reader.AreDefaultsTooLong(attributes))
+                return reader.Refuse("attribute defaults expand too much");
             reader.HandOverText();
             reader.fSink.OnStart(name, attributes);
             reader.fText.clear();
@@ -71,9 +76,9 @@ struct TXmlReader::TCallbacks {
     static void Text(void* user, const char* text, int length) noexcept
     {
         Guarded(user, [=](TXmlReader& reader) {
+            if (reader.fText.size() + static_cast<std::size_t>(length) > kMaxTextLength)
+                return reader.Refuse("text is too long");
             reader.fText.append(text, static_cast<std::size_t>(length));
-            if (reader.fText.size() > kMaxTextLength)
-                reader.Refuse("text is too long");
         });
     }
 
@@ -137,10 +142,19 @@ void TXmlReader::Reset(const char* encoding)
     XML_ParserReset(fParser.get(), encoding);
     Install();
     fText.clear();
-    fDepth = fEntities = fBytes = 0;
+    fDepth = fEntities = fBytes = fDefaultBytes = 0;
     fError.clear();
     fException = nullptr;
     fStopped = false;
+}
+
+/// Defaults are declared once and handed out for every element, which the library's own limit does not see.
+bool TXmlReader::AreDefaultsTooLong(const char** attributes)
+{
+    for (const char** next = attributes + XML_GetSpecifiedAttributeCount(fParser.get()); *next != nullptr; next += 2)
+        fDefaultBytes += std::strlen(next[1]);
+    return fDefaultBytes > kExpansionThreshold &&
+           static_cast<double>(fDefaultBytes) > kMaxAmplification * static_cast<double>(fBytes);
 }
 
 bool TXmlReader::Parse(const char* data, std::size_t length, bool last)

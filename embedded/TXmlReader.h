@@ -13,8 +13,9 @@ namespace NORVZEL20 {
 ///
 /// Events go to a sink, with text whole between two tags. A NUL behind the text is there but not counted. An exception of the sink
 /// never crosses the C library: the parse is stopped, and Parse or Finish throws it as it was.
-/// External entities are never opened: a reference to one is an error. The expansion of entities, the depth of elements, the
-/// number of attributes of an element and the length of a text and of a tag are bounded; exceeding a bound is an error.
+/// External entities are never opened: a reference to one is an error. The expansion of entities and of attribute defaults, the
+/// depth of elements, the number of attributes of an element and the length of a text and of a tag are bounded; exceeding a bound
+/// is an error.
 /// Threads: one at a time for each reader.
 class TXmlReader {
   public:
@@ -24,7 +25,7 @@ class TXmlReader {
     static constexpr std::size_t kMaxTokenLength = 16u << 20;     ///< bytes of one tag, comment or the like
     static constexpr std::size_t kMaxEntities = 1000;             ///< entities that a document declares
     static constexpr std::size_t kExpansionThreshold = 4u << 20;  ///< bytes from which on the amplification is watched
-    static constexpr float kMaxAmplification = 20.0F;             ///< output over input of entity expansion
+    static constexpr float kMaxAmplification = 20.0F;             ///< output over input of entities and of attribute defaults
 
     /// Takes the events. Pointers are valid during the call alone.
     class ISink {
@@ -81,6 +82,7 @@ class TXmlReader {
     void Install();
     bool Settle(bool succeeded);
     void Refuse(const char* reason);
+    bool AreDefaultsTooLong(const char** attributes);
     void HandOverText();
 
     ISink& fSink;
@@ -89,6 +91,7 @@ class TXmlReader {
     std::size_t fDepth = 0;
     std::size_t fEntities = 0;
     std::size_t fBytes = 0;
+    std::size_t fDefaultBytes = 0;  // of attributes that the document declares and does not write
     std::string fError;
     std::exception_ptr fException;
     bool fStopped = false;

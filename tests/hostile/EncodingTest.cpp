@@ -55,14 +55,9 @@ std::string MarkedUtf8(const std::string& text)
     return "\xEF\xBB\xBF" + text;
 }
 
-THostileRow Handled(const std::string& name, const THostileDocument& document)
+THostileRow NotWellFormed(const std::string& name, const std::string& content, std::size_t offset)
 {
-    return {name, document, "1 elements, text 'Id'", "loaded 'Id'", "rules for 'Id'"};
-}
-
-THostileRow NotWellFormed(const std::string& name, const std::string& content, const std::string& place)
-{
-    return Refused(name, {"", content}, 1, "not well-formed (invalid token)", place);
+    return Refused(name, {"", content}, offset, "not well-formed (invalid token)");
 }
 
 }  // namespace
@@ -79,52 +74,50 @@ TEST(EncodingTest, Utf16IsReadInBothByteOrders)
 
 TEST(EncodingTest, HalfACharacterIsRefused)
 {
-    ExpectOutcomes({Refused("UTF-16 that ends early", {"", "Id", WithoutLastByte}, 1, "unclosed token", "1:0"),
-                    Refused("UTF-16 and one byte", {"", "Id", WithOneByteMore}, 1, "unclosed token", "1:0"),
-                    Refused("half a surrogate pair", {"", "Id", WithLoneSurrogate}, 1, "not well-formed (invalid token)", "1:0")});
+    ExpectOutcomes({Refused("UTF-16 that ends early", {"", "Id", WithoutLastByte}, 74, "unclosed token"),
+                    Refused("UTF-16 and one byte", {"", "Id", WithOneByteMore}, 80, "unclosed token"),
+                    Refused("half a surrogate pair", {"", "Id", WithLoneSurrogate}, 1, "not well-formed (invalid token)")});
 }
 
 TEST(EncodingTest, WrongDeclarationsAreRefused)
 {
-    ExpectOutcomes({Refused("UTF-8 that says UTF-16", {"<?xml version=\"1.0\" encoding=\"UTF-16\"?>", "Id"}, 1,
-                            "encoding specified in XML declaration is incorrect", "1:0"),
-                    Refused("UTF-16 that says UTF-8", {"<?xml version=\"1.0\" encoding=\"UTF-8\"?>", "Id", MarkedLittleEndian}, 1,
-                            "encoding specified in XML declaration is incorrect", "1:0"),
-                    Refused("an encoding that is not read", {"<?xml version=\"1.0\" encoding=\"UTF-32\"?>", "Id"}, 1,
-                            "unknown encoding", "1:0"),
-                    Refused("an encoding that nobody knows", {"<?xml version=\"1.0\" encoding=\"nobody\"?>", "Id"}, 1,
-                            "unknown encoding", "1:0")});
+    const std::string declared = "<?xml version=\"1.0\" encoding=\"";
+    const std::string contradicts = "encoding specified in XML declaration is incorrect";
+    ExpectOutcomes({RefusedAt("UTF-8 that says UTF-16", {declared + "UTF-16\"?>", "Id"}, 31, contradicts),
+                    RefusedAt("UTF-16 that says UTF-8", {declared + "UTF-8\"?>", "Id", MarkedLittleEndian}, 32, contradicts),
+                    RefusedAt("an encoding that is not read", {declared + "UTF-32\"?>", "Id"}, 31, "unknown encoding"),
+                    RefusedAt("an encoding that nobody knows", {declared + "nobody\"?>", "Id"}, 31, "unknown encoding")});
 }
 
 TEST(EncodingTest, InvalidUtf8IsRefused)
 {
-    ExpectOutcomes(
-        {NotWellFormed("a continuation alone", "I\x80", "1:0"), NotWellFormed("a byte that UTF-8 has not", "I\xFF", "1:0"),
-         NotWellFormed("a slash of two bytes", "I\xC0\xAF", "1:0"), NotWellFormed("a slash of three bytes", "I\xE0\x80\xAF", "1:0"),
-         NotWellFormed("a surrogate", "I\xED\xA0\x80", "1:0"), NotWellFormed("beyond the last plane", "I\xF4\x90\x80\x80", "1:0"),
-         NotWellFormed("two bytes of three", "I\xE2\x82", "1:0"), NotWellFormed("in an attribute", "<a b='\x80'/>", "1:0"),
-         NotWellFormed("in a name", "<\xC3\x28/>", "1:0"), NotWellFormed("in a comment", "<!--\xFF-->", "1:0"),
-         NotWellFormed("not a character", "I\xEF\xBF\xBE", "1:0")});
+    ExpectOutcomes({NotWellFormed("a continuation alone", "I\x80", 1), NotWellFormed("a byte that UTF-8 has not", "I\xFF", 1),
+                    NotWellFormed("a slash of two bytes", "I\xC0\xAF", 1),
+                    NotWellFormed("a slash of three bytes", "I\xE0\x80\xAF", 1), NotWellFormed("a surrogate", "I\xED\xA0\x80", 1),
+                    NotWellFormed("beyond the last plane", "I\xF4\x90\x80\x80", 1),
+                    NotWellFormed("two bytes of three", "I\xE2\x82", 1), NotWellFormed("in an attribute", "<a b='\x80'/>", 6),
+                    NotWellFormed("in a name", "<\xC3\x28/>", 1), NotWellFormed("in a comment", "<!--\xFF-->", 4),
+                    NotWellFormed("not a character", "I\xEF\xBF\xBE", 1)});
 }
 
 TEST(EncodingTest, ControlCharactersAreRefused)
 {
     const std::string nul(1, '\0');
-    ExpectOutcomes({NotWellFormed("NUL in text", "I" + nul + "d", "1:0"), NotWellFormed("NUL in a name", "<a" + nul + "/>", "1:0"),
-                    NotWellFormed("NUL in an attribute", "<a b='" + nul + "'/>", "1:0"),
-                    NotWellFormed("NUL in CDATA", "<![CDATA[" + nul + "]]>", "1:0"), NotWellFormed("bell", "\a", "1:0"),
-                    Refused("NUL by reference", {"", "&#0;"}, 1, "reference to invalid character number", "1:0"),
-                    Refused("a surrogate by reference", {"", "&#xD800;"}, 1, "reference to invalid character number", "1:0"),
-                    Refused("NUL before the document", {nul, "Id"}, 1, "not well-formed (invalid token)", "1:0")});
+    const std::string number = "reference to invalid character number";
+    ExpectOutcomes({NotWellFormed("NUL in text", "I" + nul + "d", 1), NotWellFormed("NUL in a name", "<a" + nul + "/>", 2),
+                    NotWellFormed("NUL in an attribute", "<a b='" + nul + "'/>", 6),
+                    NotWellFormed("NUL in CDATA", "<![CDATA[" + nul + "]]>", 9), NotWellFormed("bell", "\a", 0),
+                    Refused("NUL by reference", {"", "&#0;"}, 0, number),
+                    Refused("a surrogate by reference", {"", "&#xD800;"}, 0, number),
+                    RefusedAt("NUL before the document", {nul, "Id"}, 2, "not well-formed (invalid token)")});
 }
 
-/// The parser's entry that takes a pointer alone stops at the first NUL; bytes behind it are not its concern.
 TEST(EncodingTest, BytesBehindTheDocumentAreRefused)
 {
-    ExpectOutcomes({Refused("NUL behind the document", {"", "Id", [](const std::string& text) { return text + '\0'; }}, 1,
-                            "not well-formed (invalid token)", "1:0"),
-                    Refused("another document behind", {"", "Id", [](const std::string& text) { return text + text; }}, 1,
-                            "junk after document element", "1:0")});
+    const auto withNul = [](const std::string& text) { return text + '\0'; };
+    const auto twice = [](const std::string& text) { return text + text; };
+    ExpectOutcomes({Refused("NUL behind the document", {"", "Id", withNul}, 79, "not well-formed (invalid token)"),
+                    Refused("another document behind", {"", "Id", twice}, 79, "junk after document element")});
 }
 
 }  // namespace NORVZEL20

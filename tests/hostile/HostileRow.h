@@ -28,12 +28,27 @@ inline void ExpectOutcomes(const std::vector<THostileRow>& rows)
     }
 }
 
-/// The same for documents that no reader accepts, for one reason and in one place each.
-inline THostileRow Refused(const std::string& name, const THostileDocument& document, unsigned line, const std::string& reason,
-                           const std::string& populatorPlace)
+/// The column of an inventory where the content begins when nothing stands before its element.
+constexpr std::size_t kContentColumn = 148;
+
+/// A row for what no reader accepts, for one reason: a plain error of the document, in its first line.
+inline THostileRow RefusedAt(const std::string& name, const THostileDocument& document, std::size_t column,
+                             const std::string& reason)
 {
-    return {name, document, "line " + std::to_string(line) + ": " + reason, "hostile.xml:" + populatorPlace + ": " + reason,
-            "status 9\nDiff-XML Parser line " + std::to_string(line) + ":" + reason};
+    return {name, document, "line 1: " + reason, "hostile.xml:1:" + std::to_string(column) + ": found malformed XML: " + reason,
+            "status 9\nDiff-XML Parser line 1:" + reason};
+}
+
+/// The same where the trouble begins so many characters behind the beginning of the content.
+inline THostileRow Refused(const std::string& name, const THostileDocument& document, std::size_t offset, const std::string& reason)
+{
+    return RefusedAt(name, document, document.prolog.size() + kContentColumn + offset, reason);
+}
+
+/// A row for a harmless content, whatever stands before it.
+inline THostileRow Handled(const std::string& name, const THostileDocument& document)
+{
+    return {name, document, "1 elements, text 'Id'", "loaded 'Id'", "rules for 'Id'"};
 }
 
 }  // namespace NORVZEL20

@@ -25,34 +25,63 @@ std::string Attributes(std::size_t count)
     return text;
 }
 
+/// What the populator finds first where a property's value holds an element.
+std::string UnexpectedIn(const std::string& element)
+{
+    return "hostile.xml:1:" + std::to_string(kContentColumn) + ": found element <" + element + "> in <VALUE>, expected nothing";
+}
+
+/// An element within a value ends the value, whose name is then empty.
+const std::string kEmptyProperty = "status 9\nDiff-XML Parser line 1:Invalid property \"\" specified on line 1\n\n"
+                                   "TDiffXMLParser: Threw exception in EndElementParse error on line 1";
+
 }  // namespace
 
 TEST(NestingTest, AMillionNestedElementsAreRefused)
 {
     const THostileDocument document{"", Repeat("<a>", 1000000) + Repeat("</a>", 1000000)};
-    ExpectOutcomes({Refused("nested", document, 1, "elements are nested too deeply", "1:0")});
+    const std::string reason = "elements are nested too deeply";
+    ExpectOutcomes({{"nested", document, "line 1: " + reason, UnexpectedIn("a"), "status 9\nDiff-XML Parser line 1:" + reason}});
 }
 
 TEST(NestingTest, TenThousandAttributesAreRefused)
 {
-    ExpectOutcomes({Refused("different ones", {"", "<a" + Attributes(10000) + "/>"}, 1, "too many attributes", "1:0"),
-                    Refused("one twice", {"", "<a b='' c='' b=''/>"}, 1, "duplicate attribute", "1:0")});
+    const std::string many = "<a" + Attributes(10000) + "/>";
+    ExpectOutcomes({Refused("different ones", {"", many}, many.size(), "too many attributes"),
+                    Refused("one twice", {"", "<a b='' c='' b=''/>"}, 13, "duplicate attribute")});
 }
 
-/// A long name is one that nobody knows, as any other.
+/// A long name is one that nobody knows, as any other; messages give its beginning.
 TEST(NestingTest, NamesOfAMegabyteAreNames)
 {
     const std::string name(kMegabyte, 'n');
-    ExpectOutcomes({{"element", {"", "<" + name + "/>"}, "2 elements, text ''", "", ""},
-                    {"attribute", {"", "<a " + name + "=''/>"}, "2 elements, text ''", "", ""}});
+    const std::string twoElements = "2 elements, text ''";
+    ExpectOutcomes({{"element", {"", "<" + name + "/>"}, twoElements, UnexpectedIn(std::string(80, 'n') + "..."), kEmptyProperty},
+                    {"attribute", {"", "<a " + name + "=''/>"}, twoElements, UnexpectedIn("a"), kEmptyProperty}});
 }
 
 TEST(NestingTest, TagsBeyondTheLimitAreRefused)
 {
-    const std::string name(20 * kMegabyte, 'n');
-    ExpectOutcomes({Refused("a name", {"", "<" + name + "/>"}, 1, "a tag is too long", "1:0"),
-                    Refused("a value", {"", "<a b='" + name + "'/>"}, 1, "a tag is too long", "1:0"),
-                    Refused("a comment", {"", "<!--" + name + "-->"}, 1, "a tag is too long", "1:0")});
+    const std::string name = "<" + std::string(20 * kMegabyte, 'n') + "/>";
+    const std::string value = "<a b='" + std::string(20 * kMegabyte, 'v') + "'/>";
+    ExpectOutcomes({Refused("a name", {"", name}, name.size(), "a tag is too long"),
+                    Refused("a value", {"", value}, value.size(), "a tag is too long")});
+}
+
+/// What need not be kept may be as long as it likes.
+TEST(NestingTest, LongCommentsAreReadOver)
+{
+    ExpectOutcomes({Handled("a comment", {"", "I<!--" + std::string(20 * kMegabyte, '.') + "-->d"})});
+}
+
+/// A default declared once is handed out for every element.
+TEST(NestingTest, LongDefaultsOfAttributesAreRefusedBeforeTheyAddUp)
+{
+    const std::string prolog = "<!DOCTYPE r [<!ATTLIST a b CDATA \"" + std::string(kMegabyte, 'x') + "\">]>";
+    const THostileDocument document{prolog, Repeat("<a/>", 10000)};
+    TMemoryMeter meter;
+    EXPECT_EQ("line 1: attribute defaults expand too much", document.ReadByParser());
+    EXPECT_LT(meter.GetTotal(), 200 * kMegabyte);
 }
 
 }  // namespace NORVZEL20

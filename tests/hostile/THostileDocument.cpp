@@ -32,13 +32,11 @@ class TPlainParser : public TXmlParser {
     std::string fReason;
 };
 
-std::string TellRules(const TCIMDiffEngine::TRuleset& ruleset)
+std::string TellRules(TCIMDiffEngine::TRuleset ruleset)
 {
     std::string told = "rules for";
-    for (const auto& rules : ruleset.fRules) {
-        for (const auto& property : rules.second->fProperties)
-            told += " '" + property.first + "'";
-    }
+    for (const auto& property : ruleset.getClassRules("Device")->fProperties)
+        told += " '" + property.first + "'";
     return told;
 }
 
