@@ -25,11 +25,11 @@ std::size_t GetSpecFileSize(const std::string& fileName)
 
 boost::shared_ptr<char> AllocateBuffer(std::size_t size)
 {
-    const boost::shared_ptr<char> buffer(new (std::nothrow) char[size], boost::checked_array_deleter<char>());
-    if (!buffer) {
+    char* const buffer = new (std::nothrow) char[size];
+    if (buffer == nullptr) {
         throw TZELException(TZELStatusCode::kOutOfMemory);
     }
-    return buffer;
+    return boost::shared_ptr<char>(buffer, boost::checked_array_deleter<char>());
 }
 
 /// Returns the number of bytes read, which is below `size` where the file has shrunk meanwhile.
