@@ -163,12 +163,14 @@ TCIMValue TDeltaClass::InvokeMethod(const std::string&, TCallContext&, TCallCont
 
 bool TDeltaClass::operator==(ICIMClass& other) const
 {
-    return fClass->GetName(TCallContext()) == other.GetName(TCallContext());
+    const std::string& name = fClass->GetName(TCallContext());
+    return name == other.GetName(TCallContext());
 }
 
 bool TDeltaClass::operator<(ICIMClass& other) const
 {
-    return fClass->GetName(TCallContext()) < other.GetName(TCallContext());
+    const std::string& name = fClass->GetName(TCallContext());
+    return name < other.GetName(TCallContext());
 }
 
 ICIMClass& TDeltaClass::operator=(const ICIMClass&)
