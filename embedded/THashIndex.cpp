@@ -13,7 +13,7 @@ void THashIndex::Place(std::vector<TEntry>& entries, std::size_t at, TEntry entr
 void THashIndex::Reserve(std::size_t count)
 {
     std::size_t size = fEntries.empty() ? 4 : fEntries.size();
-    while (count * 4 > size * 3) {
+    while (count * 5 > size * 4) {
         size *= 2;
     }
     if (size == fEntries.size()) {

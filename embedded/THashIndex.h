@@ -47,7 +47,7 @@ class THashIndex {
     std::size_t Next(std::size_t at) const noexcept { return (at + 1) & (fEntries.size() - 1); }
     static void Place(std::vector<TEntry>& entries, std::size_t at, TEntry entry) noexcept;
 
-    std::vector<TEntry> fEntries;  // a power of two, at most three quarters in use
+    std::vector<TEntry> fEntries;  // a power of two, at most four fifths in use
     std::size_t fCount = 0;
 };
 

@@ -1,7 +1,6 @@
 #include "embedded/TInMemClass.h"
 
 #include <algorithm>
-#include <boost/smart_ptr/make_shared.hpp>
 
 #include "embedded/TDeclCopy.h"
 #include "embedded/TInMemNamespace.h"
@@ -217,8 +216,7 @@ bool TInMemClass::IsSubclassOf(boost::shared_ptr<const ICIMClass> cls, TCallCont
 
 boost::shared_ptr<TInMemInstance> TInMemClass::AllocateInMemInstance()
 {
-    TTail tail{TInMemInstance::GetBlockSize(GetSlotCount()), nullptr};
-    return boost::allocate_shared<TInMemInstance>(TTailAllocator<TInMemInstance>(tail), shared_from_this(), tail, GetSlotCount());
+    return TInMemInstance::Create(shared_from_this());
 }
 
 boost::shared_ptr<ICIMInstance> TInMemClass::AllocateInstance(TCallContext)

@@ -38,7 +38,7 @@ void TInMemExtent::Add(const boost::shared_ptr<TInMemInstance>& instance)
 {
     CheckKeys(*instance);
     if (fInstances.size() == fInstances.capacity()) {
-        fInstances.reserve(fInstances.empty() ? 2 : fInstances.size() * 2);
+        fInstances.reserve(fInstances.size() + fInstances.size() / 2 + 2);
     }
     fIndex.Reserve(fCount + 1);
     FillGenerated(*instance);

@@ -2,6 +2,7 @@
 
 #include "embedded/TInMemClass.h"
 #include "embedded/TInMemNamespace.h"
+#include "embedded/TPlacedAllocator.h"
 #include "host/TZELException.h"
 
 namespace NORVZEL20 {
@@ -9,38 +10,42 @@ namespace NORVZEL20 {
 /// The head of a block; the properties follow it.
 struct TInMemInstance::TBlock {
     TInMemInstance* owner;
-    std::uint32_t first;  ///< the slot of the first property
-    std::uint32_t count;
 
     TInMemProperty* GetProperties() noexcept { return reinterpret_cast<TInMemProperty*>(this + 1); }
 };
 
 struct TInMemInstance::TExtras {
+    struct TLateBlock {
+        TBlock* block;
+        std::uint32_t first;  ///< the slot of the first property
+        std::uint32_t count;
+    };
+
     TExtras() = default;
     TExtras(const TExtras&) = delete;
     TExtras& operator=(const TExtras&) = delete;
     ~TExtras()
     {
-        for (TBlock* block : late) {
-            DestroyBlock(*block);
-            ::operator delete(block);
+        for (const TLateBlock& late : lateBlocks) {
+            DestroyBlock(*late.block, late.count);
+            ::operator delete(late.block);
         }
     }
 
-    std::vector<TBlock*> late;        ///< properties that the class got after the instance was made, in order of slots
-    std::vector<TSlotValue> earlier;  ///< values before the first MarkChanged
-    std::vector<TSlotValue> keys;     ///< keys as added, where they have changed since
+    std::vector<TLateBlock> lateBlocks;  ///< properties that the class got after the instance was made, in order of slots
+    std::vector<TSlotValue> earlier;     ///< values before the first MarkChanged
+    std::vector<TSlotValue> keys;        ///< keys as added, where they have changed since
 };
 
-std::size_t TInMemInstance::GetBlockSize(std::uint32_t slots) noexcept
+std::size_t TInMemInstance::GetBlockSize(std::uint32_t count) noexcept
 {
-    return sizeof(TBlock) + slots * sizeof(TInMemProperty);
+    return sizeof(TBlock) + count * sizeof(TInMemProperty);
 }
 
 TInMemInstance::TBlock* TInMemInstance::MakeBlock(void* room, TInMemInstance& owner, std::uint32_t first,
                                                   std::uint32_t count) noexcept
 {
-    TBlock* const block = new (room) TBlock{&owner, first, count};
+    TBlock* const block = new (room) TBlock{&owner};
     for (std::uint32_t position = 0; position < count; ++position) {
         const std::uint32_t slot = first + position;
         const TCIMValue null = TCIMValue::Null(owner.fClass->GetSlotDecl(slot).GetType());
@@ -49,9 +54,9 @@ TInMemInstance::TBlock* TInMemInstance::MakeBlock(void* room, TInMemInstance& ow
     return block;
 }
 
-void TInMemInstance::DestroyBlock(TBlock& block) noexcept
+void TInMemInstance::DestroyBlock(TBlock& block, std::uint32_t count) noexcept
 {
-    for (std::uint32_t position = 0; position < block.count; ++position) {
+    for (std::uint32_t position = 0; position < count; ++position) {
         block.GetProperties()[position].~TInMemProperty();
     }
 }
@@ -61,13 +66,31 @@ TInMemInstance& TInMemInstance::GetOwner(const TInMemProperty* first) noexcept
     return *(reinterpret_cast<const TBlock*>(first) - 1)->owner;
 }
 
-TInMemInstance::TInMemInstance(boost::shared_ptr<TInMemClass> cls, const TTail& tail, std::uint32_t slots) noexcept
-    : fClass(std::move(cls)), fBlock(MakeBlock(tail.address, *this, 0, slots))
-{}
+TInMemInstance::TBlock& TInMemInstance::GetOwnBlock() const noexcept
+{
+    // Properties are changed through an instance that is not: their handles are given out by operations that are const.
+    return *reinterpret_cast<TBlock*>(const_cast<TInMemInstance*>(this) + 1);
+}
+
+boost::shared_ptr<TInMemInstance> TInMemInstance::Create(boost::shared_ptr<TInMemClass> cls)
+{
+    using TAllocator = TPlacedAllocator<TInMemInstance>;
+    const std::uint32_t slots = cls->GetSlotCount();
+    char* const block = static_cast<char*>(::operator new(TAllocator::kPlace + sizeof(TInMemInstance) + GetBlockSize(slots)));
+    TInMemInstance* const instance = new (block + TAllocator::kPlace) TInMemInstance(std::move(cls), slots);
+    const auto destroy = [](TInMemInstance* made) { made->~TInMemInstance(); };
+    return boost::shared_ptr<TInMemInstance>(instance, destroy, TAllocator(block));
+}
+
+TInMemInstance::TInMemInstance(boost::shared_ptr<TInMemClass> cls, std::uint32_t slots) noexcept
+    : fClass(std::move(cls)), fSlots(slots & 0x7fffffffU), fAdded(0)
+{
+    MakeBlock(&GetOwnBlock(), *this, 0, slots);
+}
 
 TInMemInstance::~TInMemInstance()
 {
-    DestroyBlock(*fBlock);
+    DestroyBlock(GetOwnBlock(), fSlots);
 }
 
 void TInMemInstance::Validate(TCallContext) const
@@ -140,7 +163,7 @@ TInMemProperty* TInMemInstance::FindProperty(std::string_view name) const
 
 TInMemProperty& TInMemInstance::GetSlotProperty(std::uint32_t slot) const
 {
-    return slot < fBlock->count ? fBlock->GetProperties()[slot] : GetLateProperty(slot);
+    return slot < fSlots ? GetOwnBlock().GetProperties()[slot] : GetLateProperty(slot);
 }
 
 const TCIMValue& TInMemInstance::GetSlotValue(std::uint32_t slot) const
@@ -180,19 +203,19 @@ TInMemInstance::TExtras& TInMemInstance::GetExtras() const
 
 TInMemProperty& TInMemInstance::GetLateProperty(std::uint32_t slot) const
 {
-    std::vector<TBlock*>& late = GetExtras().late;
-    std::uint32_t end = fBlock->count;
-    for (TBlock* block : late) {
-        end = block->first + block->count;
+    std::vector<TExtras::TLateBlock>& lateBlocks = GetExtras().lateBlocks;
+    std::uint32_t end = fSlots;
+    for (const TExtras::TLateBlock& late : lateBlocks) {
+        end = late.first + late.count;
         if (slot < end) {
-            return block->GetProperties()[slot - block->first];
+            return late.block->GetProperties()[slot - late.first];
         }
     }
-    late.reserve(late.size() + 1);
+    lateBlocks.reserve(lateBlocks.size() + 1);
     const std::uint32_t count = fClass->GetSlotCount() - end;
-    // Properties refer to the instance as one that can be changed, which it is: it is always made by TInMemClass.
-    late.push_back(MakeBlock(::operator new(GetBlockSize(count)), const_cast<TInMemInstance&>(*this), end, count));
-    return late.back()->GetProperties()[slot - end];
+    TBlock* const block = MakeBlock(::operator new(GetBlockSize(count)), const_cast<TInMemInstance&>(*this), end, count);
+    lateBlocks.push_back(TExtras::TLateBlock{block, end, count});
+    return block->GetProperties()[slot - end];
 }
 
 void TInMemInstance::Change(TInMemProperty& property, TCIMValue value)
@@ -251,12 +274,12 @@ const TCIMValue& TInMemInstance::GetAddedKey(std::uint32_t slot) const
 void TInMemInstance::SetAdded(std::uint32_t keyHash) noexcept
 {
     fKeyHash = keyHash;
-    fAdded = true;
+    fAdded = 1;
 }
 
 void TInMemInstance::SetRemoved() noexcept
 {
-    fAdded = false;
+    fAdded = 0;
     if (fExtras) {
         fExtras->keys.clear();
     }

@@ -9,7 +9,6 @@
 #include <vector>
 
 #include "embedded/TInMemProperty.h"
-#include "embedded/TTailAllocator.h"
 #include "host/ICIMInstance.h"
 
 namespace NORVZEL20 {
@@ -22,8 +21,8 @@ class TInMemClass;
 /// stay valid when the instance is deleted and when the namespace goes; AddToNamespace then throws status 18.
 class TInMemInstance final : public ICIMInstance, public boost::enable_shared_from_this<TInMemInstance> {
   public:
-    /// For TInMemClass alone: the tail is uninitialised memory of GetBlockSize(slots) bytes in the instance's own block.
-    TInMemInstance(boost::shared_ptr<TInMemClass> cls, const TTail& tail, std::uint32_t slots) noexcept;
+    /// An instance of `cls` with every property null.
+    static boost::shared_ptr<TInMemInstance> Create(boost::shared_ptr<TInMemClass> cls);
     TInMemInstance(const TInMemInstance&) = delete;
     TInMemInstance& operator=(const TInMemInstance&) = delete;
     ~TInMemInstance() override;
@@ -52,28 +51,30 @@ class TInMemInstance final : public ICIMInstance, public boost::enable_shared_fr
     void SetSlot(std::uint32_t slot, TCIMValue value);
 
     /// Whether it is part of the namespace.
-    bool IsAdded() const noexcept { return fAdded; }
+    bool IsAdded() const noexcept { return fAdded != 0; }
     /// The name of the first key without a value, which keeps the instance from being added; null where there is none.
     const std::string* FindMissingKey() const;
-
-    static std::size_t GetBlockSize(std::uint32_t slots) noexcept;
 
   private:
     friend class TInMemProperty;
     friend class TInMemExtent;
 
-    struct TBlock;   // a block of properties: whose it is, and how many of which slots
+    struct TBlock;   // a block of properties that knows whose they are
     struct TExtras;  // what few instances have
     struct TSlotValue {
         std::uint32_t slot;
         TCIMValue value;
     };
 
+    /// Makes `count` properties from slot `first` on in `room`, which has GetBlockSize(count) bytes.
     static TBlock* MakeBlock(void* room, TInMemInstance& owner, std::uint32_t first, std::uint32_t count) noexcept;
-    static void DestroyBlock(TBlock& block) noexcept;
+    static void DestroyBlock(TBlock& block, std::uint32_t count) noexcept;
+    static std::size_t GetBlockSize(std::uint32_t count) noexcept;
     static TInMemInstance& GetOwner(const TInMemProperty* first) noexcept;
     static const TCIMValue* Find(const std::vector<TSlotValue>& values, std::uint32_t slot) noexcept;
 
+    TInMemInstance(boost::shared_ptr<TInMemClass> cls, std::uint32_t slots) noexcept;
+    TBlock& GetOwnBlock() const noexcept;
     boost::shared_ptr<ICIMProperty> GetHandle(std::uint32_t slot, const boost::shared_ptr<const TInMemInstance>& self) const;
     TExtras& GetExtras() const;
     TInMemProperty& GetLateProperty(std::uint32_t slot) const;
@@ -87,10 +88,10 @@ class TInMemInstance final : public ICIMInstance, public boost::enable_shared_fr
     void SetRemoved() noexcept;
 
     boost::shared_ptr<TInMemClass> fClass;
-    TBlock* fBlock;
     mutable std::unique_ptr<TExtras> fExtras;
     std::uint32_t fKeyHash = 0;  // of the keys as added
-    bool fAdded = false;
+    std::uint32_t fSlots : 31;   // in the own block, which stands behind the instance
+    std::uint32_t fAdded : 1;
 };
 
 }  // namespace NORVZEL20

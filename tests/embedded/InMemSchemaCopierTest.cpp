@@ -1,0 +1,99 @@
+#include "embedded/TSchemaCopier.h"
+
+#include "tests/embedded/InMemFixture.h"
+
+namespace NORVZEL20 {
+namespace {
+
+class InMemSchemaCopierTest : public TInMemFixture {
+  protected:
+    InMemSchemaCopierTest()
+    {
+        ns->AllocateQualifierDecl("Vendor", TCIMValue::Null(TType::kString), ICIMQualifierDecl::kScopeClass,
+                                  ICIMQualifierDecl::kFlavorDefault, none);
+        device = Declare("Device", nullptr, {{"Id", TType::kString, {"Key"}}});
+        device->AddQualifier(Qualifier("Vendor", TCIMValue("any")));
+        disk = Declare("Disk", device, {{"Size", TType::kUint64, {"Big"}}});
+        disk->AddPropertyDecl(Reference("Room", "Room"));
+        const auto format = boost::make_shared<TInMemMethodDecl>("Format", TType::kUint32);
+        format->AddParameter(boost::make_shared<TInMemParameter>("Label", TType::kString));
+        disk->AddMethodDecl(format);
+    }
+
+    TClassPointer device, disk;
+    boost::shared_ptr<TInMemNamespace> target = TInMemNamespace::Create("other");
+    TSchemaCopier copier{target};
+};
+
+TEST_F(InMemSchemaCopierTest, AClassComesWithItsSuperclasses)
+{
+    const auto declared = copier.CopyClass(*disk);
+    ASSERT_EQ(2U, declared.size());
+    EXPECT_EQ("Device", declared[0]->GetName());
+    const auto copy = target->FindClass("disk");
+    EXPECT_EQ(copy, declared[1]);
+    EXPECT_EQ("Id Size Room", PropertiesOf(*copy));
+    EXPECT_EQ("Id Room", KeysOf(*copy));
+    EXPECT_EQ("Big", QualifiersOf(*copy->FindPropertyDecl("Size")));
+    EXPECT_EQ("Vendor", QualifiersOf(*copy));
+    EXPECT_EQ("Room", copy->FindPropertyDecl("Room")->GetReferenceClass());
+    EXPECT_EQ("Label", copy->FindMethodDecl("Format")->GetParameters().at(0)->GetName());
+    EXPECT_NE(nullptr, target->FindQualifierDecl("Vendor"));
+    EXPECT_EQ(target, copy->GetInMemNamespace());
+    EXPECT_NE(disk->FindPropertyDecl("Size"), copy->FindPropertyDecl("Size"));
+}
+
+TEST_F(InMemSchemaCopierTest, WhatIsThereIsLeftAlone)
+{
+    target->AllocateInMemClass("DEVICE", nullptr)->AddToNamespace(none);
+    const auto declared = copier.CopyClass(*disk);
+    ASSERT_EQ(1U, declared.size());
+    EXPECT_EQ("DEVICE", declared[0]->GetSuperInMemClass()->GetName());
+    EXPECT_TRUE(copier.CopyClass(*disk).empty());
+    EXPECT_TRUE(copier.CopyClass(*device).empty());
+}
+
+TEST_F(InMemSchemaCopierTest, AConflictOfTypesDeclaresNoClass)
+{
+    const auto other = target->AllocateInMemClass("Device", nullptr);
+    other->AddPropertyDecl(Decl({"Size", TType::kString, {}}));
+    other->AddToNamespace(none);
+    const auto fast = Declare("FastDisk", disk);
+    EXPECT_EQ(13, StatusOf([&] { copier.CopyClass(*fast); }));
+    EXPECT_EQ(1U, target->GetClasses().size());
+}
+
+TEST_F(InMemSchemaCopierTest, APropertyComesWithItsQualifiersAndInstancesGetANull)
+{
+    const auto cls = target->AllocateInMemClass("Disk", nullptr);
+    cls->AddPropertyDecl(Decl({"Id", TType::kString, {"Key"}}));
+    cls->AddToNamespace(none);
+    const auto instance = Add(cls, {{"Id", "sda"}});
+    const auto copy = copier.CopyPropertyDecl(*disk->FindPropertyDecl("Size"), *cls);
+    ASSERT_NE(nullptr, copy);
+    EXPECT_EQ("Big", QualifiersOf(*copy));
+    EXPECT_EQ("Id=sda Size=NULL", ValuesOf(*instance));
+    EXPECT_EQ(nullptr, copier.CopyPropertyDecl(*disk->FindPropertyDecl("Size"), *cls));
+}
+
+TEST_F(InMemSchemaCopierTest, NamesAreRespelledAndReferencesStayFound)
+{
+    copier.CopyClass(*disk);
+    const auto room = target->AllocateInMemClass("room", nullptr);
+    room->AddPropertyDecl(Decl({"Name", TType::kString, {"Key"}}));
+    room->AddToNamespace(none);
+    const auto hall = Add(room, {{"Name", "hall"}});
+    const auto sda = Add(target->FindClass("Disk"), {{"Id", "sda"}, {"Room", TCIMValue(hall->GetReference())}});
+    EXPECT_TRUE(copier.RespellClass("Room"));
+    EXPECT_FALSE(copier.RespellClass("Room"));
+    EXPECT_FALSE(copier.RespellClass("Cellar"));
+    EXPECT_EQ("other:Disk.Id=\"sda\",Room=\"other:Room.Name=\\\"hall\\\"\"", sda->GetReference().GetPath());
+    EXPECT_EQ(sda, target->FindInstance(sda->GetReference()));
+    EXPECT_TRUE(copier.RespellProperty(*room, "NAME"));
+    EXPECT_FALSE(copier.RespellProperty(*room, "NAME"));
+    EXPECT_FALSE(copier.RespellProperty(*target->FindClass("Disk"), "ID"));
+    EXPECT_EQ("other:Room.NAME=\"hall\"", hall->GetReference().GetPath());
+}
+
+}  // namespace
+}  // namespace NORVZEL20
