@@ -110,7 +110,7 @@ TEST(DateTimeTest, EightDigitsAreTheDaysOfAnInterval)
 TEST(DateTimeTest, EveryDayOfFourHundredYearsComesBack)
 {
     std::int64_t expected = At("18000101000000.000000+000").GetMicroseconds();
-    char text[32];
+    char text[64];
     for (int year = 1800; year < 2200; ++year) {
         for (int month = 1; month <= 12; ++month) {
             for (int day = 1; day <= 31; ++day) {
