@@ -72,6 +72,7 @@ TEST_P(KeysTest, KeysAreReadInTheClassesOrder)
     Engine().buildPath(RulesWithout(""), disk);
     EXPECT_EQ("ns0:Disk.Bus=1,Id=\"sda\".GetClass() {}\n"
               "ns0:Disk.EnumerateKeyNames() {}\n"
+              "ns0:Disk.Bus=1,Id=\"sda\".GetClass() {}\n"
               "ns0:Disk.Bus=1,Id=\"sda\".GetProperty(\"Bus\") {}\n"
               "ns0:Disk.Bus=1,Id=\"sda\".Bus.GetValue() {}\n"
               "ns0:Disk.Bus=1,Id=\"sda\".GetProperty(\"Id\") {}\n"

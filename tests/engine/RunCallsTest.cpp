@@ -90,7 +90,7 @@ std::string Key(const std::string& ns, const std::string& id)
 {
     const std::string disk = ns + ":Disk.Id=\"" + id + "\"";
     return disk + ".GetClass() {}\n" + ns + ":Disk.EnumerateKeyNames() {}\n" +
-           Calls(disk, {"GetProperty(\"Id\") {}", "Id.GetValue() {}"});
+           Calls(disk, {"GetClass() {}", "GetProperty(\"Id\") {}", "Id.GetValue() {}"});
 }
 
 // How one property of two disks is read.
@@ -145,9 +145,8 @@ TEST_P(RunCallsTest, OfTwoNamespaces)
                   Key("ns1", "sdc") + kClassRecord + Record(1, "Disk.Id=\"sdb\"", "", "1", 1) +
                   Calls("ns0:Disk.Id=\"sdb\"", {"EnumerateProperties() {}", "Id.GetValue() {}", "Id.MarkRemoved()",
                                                 "Size.GetValue() {}", "Size.MarkRemoved()"}) +
-                  "ns1.GetClass(\"Disk\") {}\n"
-                  "ns1:Disk.EnumerateInstances(false) {}\n" +
-                  Key("ns1", "sda") + Key("ns1", "sdc") + Record(2, "Disk.Id=\"sdc\"", "", "1", 2) +
+                  "ns1:Disk.EnumerateInstances(false) {}\n" + Key("ns1", "sda") + Key("ns1", "sdc") +
+                  Record(2, "Disk.Id=\"sdc\"", "", "1", 2) +
                   "ns0:Disk.AllocateInstance() {}\n"
                   "ns1:Disk.Id=\"sdc\".EnumerateProperties() {}\n" +
                   Calls("ns1:Disk.Id=\"sdc\"", {"Id.GetValue() {}", "Id.GetPropertyDecl() {}", "Id.Decl.GetName() {}"}) +
@@ -192,7 +191,8 @@ std::string Alias(const std::string& ns, const std::string& id, bool isWrapperTh
 // The key of a disk where its one key is excluded.
 std::string EmptyKey(const std::string& ns, const std::string& id)
 {
-    return ns + ":Disk.Id=\"" + id + "\".GetClass() {}\n" + ns + ":Disk.EnumerateKeyNames() {}\n";
+    const std::string disk = ns + ":Disk.Id=\"" + id + "\"";
+    return disk + ".GetClass() {}\n" + ns + ":Disk.EnumerateKeyNames() {}\n" + disk + ".GetClass() {}\n";
 }
 
 TEST_P(RunCallsTest, OfRulesThatExcludeKeys)

@@ -52,7 +52,7 @@ boost::shared_ptr<INamespaceProviderManager> TRootObject::GetNamespaceProviderMa
         return nullptr;
     }
     using TOperation = boost::shared_ptr<INamespaceProviderManager> (*)();
-    return Original<TOperation>("_ZN8NORVZEL2011TRootObject27GetNamespaceProviderManagerEv")();
+    return Original<TOperation>("_ZN9NORVZEL2011TRootObject27GetNamespaceProviderManagerEv")();
 }
 
 boost::shared_ptr<TNamespaceProviderManager> TNamespaceProviderManager::GetInstance()
@@ -61,7 +61,7 @@ boost::shared_ptr<TNamespaceProviderManager> TNamespaceProviderManager::GetInsta
         return nullptr;
     }
     using TOperation = boost::shared_ptr<TNamespaceProviderManager> (*)();
-    return Original<TOperation>("_ZN8NORVZEL2025TNamespaceProviderManager11GetInstanceEv")();
+    return Original<TOperation>("_ZN9NORVZEL2025TNamespaceProviderManager11GetInstanceEv")();
 }
 
 boost::shared_ptr<INamespaceProvider> TNamespaceProviderManager::FindProvider(const std::string& name)

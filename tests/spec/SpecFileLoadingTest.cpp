@@ -45,7 +45,7 @@ std::uint64_t TOSSpecific::GetFileSize(std::string path)
     }
     using TOperation = std::uint64_t (*)(std::string);
     static const auto original = reinterpret_cast<TOperation>(
-        dlsym(RTLD_NEXT, "_ZN8NORVZEL2011TOSSpecific11GetFileSizeENSt7__cxx1112basic_stringIcSt11char_traitsIcESaIcEEE"));
+        dlsym(RTLD_NEXT, "_ZN9NORVZEL2011TOSSpecific11GetFileSizeENSt7__cxx1112basic_stringIcSt11char_traitsIcESaIcEEE"));
     return original(path);
 }
 

@@ -1,0 +1,16 @@
+#pragma once
+
+#include <string>
+
+#include "tests/engine/NaiveSet.h"
+#include "tests/support/TComparison.h"
+
+namespace NORVZEL20 {
+
+/// The specification of a set, as a document.
+std::string RulesOf(const TNaiveSet& set);
+
+/// Builds the set in namespaces of that host, runs the plug-in over it, and tells what it leaves behind as CompareNaively does.
+std::string CompareByPlugIn(const TNaiveSet& set, EHost host);
+
+}  // namespace NORVZEL20
