@@ -178,7 +178,7 @@ TEST_P(RunCallsTest, OfThreeNamespaces)
               CallsOfRun());
 }
 
-// An alias: the instance's class is asked for its name, then the delta namespace for its wrapper.
+// An alias for a difference: the instance's class is asked for its name, then the delta namespace for its wrapper.
 std::string Alias(const std::string& ns, const std::string& id, bool isWrapperThere)
 {
     const std::string index = ns.substr(2);
@@ -238,7 +238,12 @@ TEST_P(RunCallsTest, OfRulesThatExcludeKeysWithAnUnknownInstance)
                   "ns0:Disk.EnumerateInstances(false) {}\n"
                   "ns1.GetClass(\"Disk\") {}\n"
                   "ns1:Disk.EnumerateInstances(false) {}\n" +
-                  EmptyKey("ns1", "sda") + Alias("ns1", "sda", false) +
+                  EmptyKey("ns1", "sda") +
+                  "ns1:Disk.Id=\"sda\".GetReference() {}\n"
+                  "ns1:Disk.Id=\"sda\".GetClass() {}\n"
+                  "ns1:Disk.GetName() {}\n"
+                  "store.GetClass(\"Disk\") {nsIndex=1}\n"
+                  "ns1.GetClass(\"Disk\") {nsIndex=1}\n"
                   "ns2.GetClass(\"Disk\") {}\n"
                   "ns2:Disk.EnumerateInstances(false) {}\n" +
                   kClassRecord + Record(2, "Disk", "", "1", 1) + kEndOfWalk,

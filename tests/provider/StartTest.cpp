@@ -17,7 +17,6 @@ namespace NORVZEL20 {
 namespace {
 
 bool gIsManagerMissing = false;
-bool gIsProviderMissing = false;
 int gPopulationStatus = 0;
 const char* gRoot = "";
 std::string* gCalls = nullptr;
@@ -27,6 +26,16 @@ TOperation Original(const char* symbol)
 {
     return reinterpret_cast<TOperation>(dlsym(RTLD_NEXT, symbol));
 }
+
+// An explicit instantiation may name private members: so a test can have the one registry of the process hold what it wants.
+using TProviders = std::vector<boost::shared_ptr<INamespaceProvider>>;
+TProviders& ProvidersOf(TNamespaceProviderManager& manager);
+
+template <TProviders TNamespaceProviderManager::*Member>
+struct TRegistryAccess {
+    friend TProviders& ProvidersOf(TNamespaceProviderManager& manager) { return manager.*Member; }
+};
+template struct TRegistryAccess<&TNamespaceProviderManager::fProviders>;
 
 // Answers as "inmem" does, and tells what it was asked.
 class TTellingProvider : public INamespaceProvider {
@@ -64,15 +73,6 @@ boost::shared_ptr<TNamespaceProviderManager> TNamespaceProviderManager::GetInsta
     return Original<TOperation>("_ZN9NORVZEL2025TNamespaceProviderManager11GetInstanceEv")();
 }
 
-boost::shared_ptr<INamespaceProvider> TNamespaceProviderManager::FindProvider(const std::string& name)
-{
-    if (gIsProviderMissing) {
-        return nullptr;
-    }
-    *gCalls += "FindProvider " + Quoted(name) + "\n";
-    return boost::shared_ptr<INamespaceProvider>(new TTellingProvider);
-}
-
 std::string TOSSpecific::GetZELRootPath()
 {
     return gRoot;
@@ -92,13 +92,19 @@ namespace {
 
 class StartTest : public testing::Test {
   protected:
-    StartTest() { gCalls = &fCalls; }
+    StartTest() : fRegistered(Registry())
+    {
+        gCalls = &fCalls;
+        Registry() = {boost::shared_ptr<INamespaceProvider>(new TTellingProvider)};
+    }
     ~StartTest() override
     {
         gIsManagerMissing = false;
-        gIsProviderMissing = false;
+        Registry() = fRegistered;
         gPopulationStatus = 0;
     }
+
+    static TProviders& Registry() { return ProvidersOf(*TNamespaceProviderManager::GetInstance()); }
 
     std::string CallsWithRoot(const char* root)
     {
@@ -109,12 +115,12 @@ class StartTest : public testing::Test {
     }
 
     std::string fCalls;
+    const TProviders fRegistered;
 };
 
 TEST_F(StartTest, TheStoreIsAllocatedAndFilledWithTheSchema)
 {
-    EXPECT_EQ("FindProvider \"inmem\"\n"
-              "AllocateNamespace {} false \"root/cimv2\"\n"
+    EXPECT_EQ("AllocateNamespace {} false \"root/cimv2\"\n"
               "PopulateFromXMLFile store /opt/x/data/deltaclasses.properties.xml\n",
               CallsWithRoot("/opt/x"));
 }
@@ -136,7 +142,7 @@ TEST_F(StartTest, AFailureOfThePopulatorLeavesTheAllocation)
 
 TEST_F(StartTest, AMissingStoreProviderFailsTheAssertion)
 {
-    gIsProviderMissing = true;
+    Registry().clear();
     EXPECT_TRUE(FailsOnNull([&] { CallsWithRoot("/opt/x"); }));
 }
 
