@@ -218,6 +218,7 @@ TEST(ReferenceTest, OtherFormsOfAPathAreUnderstood)
         {"C.a=+5,b=0x1F,c=-0x1f", "C.a=5,b=31,c=-31"},
         {"C.a=\"\\a\\b\"", "C.a=\"ab\""},
         {":Disk", "Disk"},
+        {"/Disk", "Disk"},
     };
     for (const auto& [text, path] : cases) {
         EXPECT_EQ(path, TCIMReference::Parse(text).GetPath()) << text;

@@ -244,6 +244,15 @@ TEST(ValueTest, ABagOnTheLeftIsComparedAsAMultiset)
                 Array({TCIMValue(Setting(2)), TCIMValue(Setting(1))}));
 }
 
+TEST(ValueTest, ElementsOfABagThatHashAlikeAreStillToldApart)
+{
+    const TCIMValue nan(std::numeric_limits<double>::quiet_NaN());
+    const TCIMValue tiny(1e-300);
+    ASSERT_EQ(nan.Hash(), tiny.Hash());
+    EXPECT_TRUE(Array({nan, tiny}).AsBag() == Array({tiny, nan}));
+    EXPECT_FALSE(Array({nan, tiny}).AsBag() == Array({nan, nan}));
+}
+
 TEST(ValueTest, OnlyArraysBecomeBags)
 {
     EXPECT_TRUE(Numbers({1}).AsBag().IsBag());
