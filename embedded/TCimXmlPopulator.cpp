@@ -38,7 +38,7 @@ class TFileSource {
     std::size_t operator()(char* buffer, std::size_t size)
     {
         const std::size_t length = std::fread(buffer, 1, size, fFile.get());
-        if (length == 0 && std::ferror(fFile.get()) != 0)
+        if (std::ferror(fFile.get()) != 0)
             Fail("cannot read the file: ");
         return length;
     }
@@ -86,9 +86,11 @@ class TLoad {
 
     TCimXmlLoader& GetLoader() noexcept { return fLoader; }
 
-    TLoadReport Finish()
+    void Finish() { fLoader.Finish(); }
+
+    /// Nothing can fail from here on.
+    TLoadReport Commit() noexcept
     {
-        fLoader.Finish();
         fLoader.Commit();
         return std::move(fContext.GetReport());
     }
@@ -127,9 +129,9 @@ TLoadReport TCimXmlPopulator::Load(const std::string& name, TRead read)
     if (fKeep)
         load.GetLoader().KeepElements();
     read(load);
-    TLoadReport report = load.Finish();
+    load.Finish();
     fElements = load.GetLoader().TakeElements();
-    return report;
+    return load.Commit();
 }
 
 TLoadReport TCimXmlPopulator::LoadFromMemory(const char* data, std::size_t length, const std::string& name)

@@ -139,7 +139,10 @@ void TXmlReader::Install()
 
 void TXmlReader::Reset(const char* encoding)
 {
-    XML_ParserReset(fParser.get(), encoding);
+    // Resetting to an encoding would fall back to the document's own, without a word, where memory is short.
+    XML_ParserReset(fParser.get(), nullptr);
+    if (encoding != nullptr && XML_SetEncoding(fParser.get(), encoding) == XML_STATUS_ERROR)
+        throw std::bad_alloc();
     Install();
     fText.clear();
     fDepth = fEntities = fBytes = fDefaultBytes = 0;
@@ -221,6 +224,8 @@ std::size_t TXmlReader::GetPending() const
 
 void TXmlReader::Stop()
 {
+    fLine = GetLine();  // the library moves on a little when it stops
+    fColumn = GetColumn();
     fStopped = true;
     XML_StopParser(fParser.get(), XML_FALSE);
 }
@@ -239,12 +244,12 @@ void TXmlReader::HandOverText()
 
 std::size_t TXmlReader::GetLine() const
 {
-    return XML_GetCurrentLineNumber(fParser.get());
+    return fStopped ? fLine : XML_GetCurrentLineNumber(fParser.get());
 }
 
 std::size_t TXmlReader::GetColumn() const
 {
-    return XML_GetCurrentColumnNumber(fParser.get()) + 1;
+    return fStopped ? fColumn : XML_GetCurrentColumnNumber(fParser.get()) + 1;
 }
 
 }  // namespace NORVZEL20

@@ -48,6 +48,7 @@ class TXmlReader {
     ~TXmlReader();
 
     /// Makes the reader ready for a new document; `encoding` (may be null) overrides what the document says of its own.
+    /// Errors: std::bad_alloc.
     void Reset(const char* encoding = nullptr);
 
     /// Parses the next `length` bytes; `last` ends the document too, at less cost than a call of Finish. Returns false where the
@@ -95,6 +96,8 @@ class TXmlReader {
     std::string fError;
     std::exception_ptr fException;
     bool fStopped = false;
+    std::size_t fLine = 0;  // where the parse was stopped
+    std::size_t fColumn = 0;
 };
 
 }  // namespace NORVZEL20
