@@ -1,5 +1,7 @@
 #include "tests/faults/DifferingNamespaces.h"
 
+#include <set>
+
 #include "host/TAddToVectorCallback.h"
 #include "tests/support/Dump.h"
 
@@ -63,29 +65,33 @@ std::string RecordText(const ICIMInstance& record)
            ValueOf(record, "Property").ToText() + " " + ValueOf(record, "NamespaceIndices").ToText();
 }
 
-/// Puts the three kinds of records back into the order of writing: the class record stands before the first record that is tied
-/// to it; a record without association was written last.
+/// Puts the three kinds of records back into the order of writing: a class record stands before the first record that is tied to
+/// it; one that nothing is tied to stands before the loose record, or else the class, that comes next.
 class TTrace {
   public:
     explicit TTrace(boost::shared_ptr<ICIMNamespace> store)
         : fClasses(InstancesOf(store, "KALMO_DeltaClass")), fDeltas(InstancesOf(store, "KALMO_Delta")),
           fTies(InstancesOf(store, "KALMO_DeltaClassAssocToDelta"))
-    {}
+    {
+        for (const auto& tie : fTies) {
+            fTiedClasses.insert(ValueOf(*tie, "Class").ToText());
+        }
+    }
 
     std::vector<std::string> Tell()
     {
-        for (std::size_t index = 0; index < fDeltas.size(); ++index) {
-            const bool isTied = index < fTies.size();
-            TellClassesUpTo(isTied ? ValueOf(*fTies[index], "Class").ToText() : "");
-            fTexts.push_back(RecordText(*fDeltas[index]));
+        for (const auto& delta : fDeltas) {
+            const bool isTied = fTiesTold < fTies.size() && ValueOf(*fTies[fTiesTold], "Delta").ToText() == PathOf(*delta);
+            isTied ? TellClassesUpTo(ValueOf(*fTies[fTiesTold], "Class").ToText()) : TellUntiedClass();
+            fTexts.push_back(RecordText(*delta));
             if (isTied) {
-                const bool fits = ValueOf(*fTies[index], "Delta").ToText() == PathOf(*fDeltas[index]);
-                fTexts.push_back(fits ? "tie" : "tie of another record");
+                fTexts.push_back("tie");
+                ++fTiesTold;
             }
         }
         TellClassesUpTo("");
-        if (fTies.size() > fDeltas.size()) {
-            fTexts.push_back("ties without records");
+        if (fTiesTold < fTies.size()) {
+            fTexts.push_back("ties of other records");
         }
         return fTexts;
     }
@@ -94,15 +100,29 @@ class TTrace {
     void TellClassesUpTo(const std::string& path)
     {
         while (fClassesTold < fClasses.size() && (fClassesTold == 0 || PathOf(*fClasses[fClassesTold - 1]) != path)) {
-            fTexts.push_back("class " + ValueOf(*fClasses[fClassesTold], "ClassName").ToText());
-            ++fClassesTold;
+            TellClass();
         }
+    }
+
+    void TellUntiedClass()
+    {
+        if (fClassesTold < fClasses.size() && fTiedClasses.count(PathOf(*fClasses[fClassesTold])) == 0) {
+            TellClass();
+        }
+    }
+
+    void TellClass()
+    {
+        fTexts.push_back("class " + ValueOf(*fClasses[fClassesTold], "ClassName").ToText());
+        ++fClassesTold;
     }
 
     TInstances fClasses;
     TInstances fDeltas;
     TInstances fTies;
+    std::set<std::string> fTiedClasses;
     std::size_t fClassesTold = 0;
+    std::size_t fTiesTold = 0;
     std::vector<std::string> fTexts;
 };
 

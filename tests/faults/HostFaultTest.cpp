@@ -8,6 +8,7 @@
 #include "tests/support/TCapturingLogger.h"
 #include "tests/support/TComparison.h"
 #include "tests/support/TTestAccess.h"
+#include "tests/support/TWatchedNamespace.h"
 
 namespace NORVZEL20 {
 namespace {
@@ -54,7 +55,11 @@ struct TPrepared {
         return outcome.empty() ? outcome : outcome.substr(0, outcome.size() - 1);
     }
 
-    std::vector<std::string> Records() { return TraceRecords(TTestAccess::Store(comparison.Delta())); }
+    std::vector<std::string> Records()
+    {
+        const auto watched = boost::dynamic_pointer_cast<TWatchedNamespace>(TTestAccess::Store(comparison.Delta()));
+        return TraceRecords(watched->GetWatched());
+    }
 
     TComparison comparison;
 };

@@ -1,7 +1,6 @@
 #include <gtest/gtest.h>
 
 #include "tests/faults/TFaultyRun.h"
-#include "tests/support/TCapturingLogger.h"
 
 namespace NORVZEL20 {
 namespace {
@@ -12,7 +11,7 @@ struct TCase {
     bool excludesKeys;
 };
 
-/// Memory that runs out during a run; what the log says is not shown.
+/// Memory that runs out during a run.
 class RunOutOfMemory : public testing::TestWithParam<TCase> {
   protected:
     std::string FailEach(const std::string& series, TFailingAllocator::EMode mode)
@@ -23,9 +22,6 @@ class RunOutOfMemory : public testing::TestWithParam<TCase> {
         const auto make = [&] { return std::make_unique<TFaultyRun>(param.namespaces, param.excludesKeys, expected); };
         return FailEachAllocation(series + param.name, make, mode);
     }
-
-  private:
-    TCapturingLogger fLog;
 };
 
 TEST_P(RunOutOfMemory, OneFailedAllocationEndsItAndTheNextRunIsWhole)

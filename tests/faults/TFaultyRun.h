@@ -6,6 +6,7 @@
 
 #include "provider/TDeltaNamespace.h"
 #include "tests/faults/FailEachAllocation.h"
+#include "tests/support/TCapturingLogger.h"
 #include "tests/support/TTemporaryFile.h"
 
 namespace NORVZEL20 {
@@ -37,6 +38,7 @@ class TFaultyRun : public IFaultyAction {
     std::vector<std::string> GetRecords() const;
     void VerifyAnotherRun(const std::vector<std::string>& before);
 
+    TCapturingLogger fLog;
     TTemporaryFile fRules;
     boost::shared_ptr<TDeltaNamespace> fDelta;
     std::vector<boost::shared_ptr<ICIMNamespace>> fNamespaces;

@@ -3,6 +3,7 @@
 #include <filesystem>
 #include <iostream>
 
+#include "embedded/TCoreLog.h"
 #include "tests/faults/TFailingAllocator.h"
 #include "tests/longrun/TRecordWriter.h"
 #include "tests/longrun/TSmallComparison.h"
@@ -15,6 +16,20 @@ using TUsage = TFailingAllocator::TUsage;
 
 const int kManyRuns = 10000;
 const int kWarmUp = 100;
+
+/// Takes the place of the core log while it lives, and keeps nothing.
+class TQuietLogger : public ILogger {
+  public:
+    TQuietLogger() : fBefore(TCoreLog::Set(this)) {}
+    TQuietLogger(const TQuietLogger&) = delete;
+    TQuietLogger& operator=(const TQuietLogger&) = delete;
+    ~TQuietLogger() override { TCoreLog::Set(fBefore); }
+
+    void Log(int, const std::string&) override {}
+
+  private:
+    ILogger* fBefore;
+};
 
 std::ptrdiff_t CountOpenFiles()
 {
@@ -74,6 +89,7 @@ TEST(LongRun, NewDeltaNamespacesOverTwoNewNamespacesLeaveNothing)
 
 TEST(LongRun, FailingRunsLeaveNothing)
 {
+    const TQuietLogger quiet;
     const TSmallComparison comparison(3, false);
     const TTemporaryFile rules("<DifftoolSpec><class name='Disk' default='include'/><class name='Nowhere'/></DifftoolSpec>");
     ExpectFlat("FailingRuns", 1000, [&] {

@@ -61,14 +61,13 @@ TEST_F(RetainedWrappers, RetainTheSameAmountWithEachDeltaNamespace)
         EXPECT_EQ(retained, MeasureRetained(deltas[index]));
     }
     EXPECT_EQ(whole + deltas.size() * retained, TFailingAllocator::GetLive().bytes);
-    std::cout << "rules that exclude keys: " << retained << " bytes stay with each delta namespace\n";
-    RecordProperty("BytesRetained", std::to_string(retained));
-
     for (const TWeak& delta : deltas) {
         BreakTheCycle(delta);
     }
     deltas = std::vector<TWeak>();
     EXPECT_EQ(before, TFailingAllocator::GetLive().bytes);
+    std::cout << "rules that exclude keys: " << retained << " bytes stay with each delta namespace\n";
+    RecordProperty("BytesRetained", std::to_string(retained));
 }
 
 TEST_F(RetainedWrappers, AnotherRunRetainsItsRecordsButNoMoreWrappers)
