@@ -2,10 +2,9 @@
 
 #include "embedded/TAssertionFailure.h"
 #include "host/TAddToVectorCallback.h"
-#include "provider/TDeltaClass.h"
 #include "tests/engine/TEngineFixture.h"
 #include "tests/support/Dump.h"
-#include "tests/support/TTestAccess.h"
+#include "tests/support/TWatchedNamespace.h"
 
 namespace NORVZEL20 {
 namespace {
@@ -147,6 +146,28 @@ TEST_P(DeltaRecordsTest, AFailureBeforeTheRecordLeavesNothing)
     Watch().FailCallsOf("store:new KALMO_Delta.AddToNamespace", TZELStatusCode::kNamespaceGone);
     EXPECT_EQ("status 18", OutcomeOf([&] { Create(kChanged, "i", "p", {1}); }));
     EXPECT_EQ("Disk\n", fComparison.Records());
+}
+
+// A delta namespace without any class.
+class TClasslessNamespace : public TWatchedNamespace {
+  public:
+    TClasslessNamespace() : TWatchedNamespace(MakeNamespace(EHost::kPlain, ""), boost::make_shared<TCallWatch>(), "classless") {}
+
+    boost::shared_ptr<ICIMClass> GetClass(const std::string&, TCallContext) override { return nullptr; }
+};
+
+TEST_P(DeltaRecordsTest, ANullClassFailsTheAssertion)
+{
+    TEngine engine(boost::make_shared<TClasslessNamespace>(), fNamespaces, "|fVMWareEnable");
+    EXPECT_THROW(engine.createCIMDiff(fRecord, kChanged, "i", "p", {1}), TAssertionFailure);
+    EXPECT_NE(std::string::npos, fLog.Take().find("px != 0"));
+    EXPECT_THROW(engine.createObjectPathAlias("Disk", "k", PathTo("", 1, "a"), 0), TAssertionFailure);
+}
+
+TEST_P(DeltaRecordsTest, ANullRecordFailsTheAssertionAfterItsDelta)
+{
+    EXPECT_THROW(Engine().createCIMDiff(nullptr, kChanged, "i", "p", {1}), TAssertionFailure);
+    EXPECT_EQ("Disk\nloose  4 i p [1]\n", fComparison.Records());
 }
 
 class AliasTest : public DeltaRecordsTest {};

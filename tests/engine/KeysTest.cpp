@@ -1,3 +1,4 @@
+#include "embedded/TAssertionFailure.h"
 #include "tests/engine/TEngineFixture.h"
 
 namespace NORVZEL20 {
@@ -85,6 +86,13 @@ TEST_P(KeysTest, ErrorsOfTheHostPassThrough)
     const auto disk = Disk(0, {{"Id", "sda"}, {"Bus", 1u}});
     Watch().FailCallsOf("ns0:Disk.EnumerateKeyNames", TZELStatusCode::kNamespaceGone);
     EXPECT_EQ("status 18", OutcomeOf([&] { Engine().buildPath(RulesWithout(""), disk); }));
+}
+
+TEST_P(KeysTest, NullRulesFailTheAssertion)
+{
+    const auto disk = Disk(0, {{"Id", "sda"}, {"Bus", 1u}});
+    EXPECT_THROW(Engine().buildPath(nullptr, disk), TAssertionFailure);
+    EXPECT_THROW(Engine().buildPath(nullptr, PathTo("", 1, "sda")), TAssertionFailure);
 }
 
 }  // namespace

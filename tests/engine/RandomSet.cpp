@@ -14,12 +14,12 @@ using EKind = TNaiveValue::EKind;
 // Makes one set; the same draws everywhere, whatever the library's distributions do.
 class TGenerator {
   public:
-    TGenerator(std::uint64_t seed, bool isStrict) : fRandom(seed), fIsStrict(isStrict) {}
+    TGenerator(const std::function<std::uint64_t()>& source, bool isStrict) : fSource(source), fIsStrict(isStrict) {}
 
     TNaiveSet Make();
 
   private:
-    std::size_t Below(std::size_t bound) { return static_cast<std::size_t>(fRandom() % bound); }
+    std::size_t Below(std::size_t bound) { return static_cast<std::size_t>(fSource() % bound); }
     bool OneIn(std::size_t count) { return Below(count) == 0; }
     template <class T>
     const T& OneOf(const std::vector<T>& choices)
@@ -36,7 +36,7 @@ class TGenerator {
     TNaiveElement MakeElement();
     bool IsThere(const TNaiveNamespace& ns, const TNaiveInstance& instance);
 
-    std::mt19937_64 fRandom;
+    const std::function<std::uint64_t()>& fSource;
     bool fIsStrict;
     std::vector<TNaiveClass> fSchema;
 };
@@ -214,7 +214,13 @@ TNaiveElement TGenerator::MakeElement()
 
 TNaiveSet MakeRandomSet(std::uint64_t seed, bool isStrict)
 {
-    return TGenerator(seed, isStrict).Make();
+    std::mt19937_64 random(seed);
+    return MakeRandomSet([&random] { return random(); }, isStrict);
+}
+
+TNaiveSet MakeRandomSet(const std::function<std::uint64_t()>& source, bool isStrict)
+{
+    return TGenerator(source, isStrict).Make();
 }
 
 }  // namespace NORVZEL20

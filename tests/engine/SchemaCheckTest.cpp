@@ -80,6 +80,13 @@ TEST_P(SchemaCheckTest, AnotherFailureKeepsItsStatus)
     EXPECT_EQ("", fLog.Take());
 }
 
+TEST_P(SchemaCheckTest, AReferenceWithoutItsRootEndsTheRun)
+{
+    Namespace(1);
+    fComparison.GetWatch().FailCallsOf("ns0.GetClass(\"<root>\")", TZELStatusCode::kNotFound);
+    EXPECT_EQ("status 15\n", RecordsAfterRun());
+}
+
 TEST_P(SchemaCheckTest, ClassesThatOnlyOthersHaveAreNotVisited)
 {
     Namespace(0);

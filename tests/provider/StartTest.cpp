@@ -18,6 +18,7 @@ namespace {
 
 bool gIsManagerMissing = false;
 int gPopulationStatus = 0;
+int gAllocationStatus = 0;
 const char* gRoot = "";
 std::string* gCalls = nullptr;
 
@@ -44,6 +45,9 @@ class TTellingProvider : public INamespaceProvider {
     boost::shared_ptr<ICIMNamespace> AllocateNamespace(TCallContext context, bool flag, std::string name) const override
     {
         *gCalls += "AllocateNamespace" + ContextText(context) + " " + FlagText(flag) + " " + Quoted(name) + "\n";
+        if (gAllocationStatus != 0) {
+            throw TZELException(static_cast<TZELStatusCode::EStatusCode>(gAllocationStatus));
+        }
         return TPlainNamespace::Create(name);
     }
     int GetType(TCallContext) const override { return 0; }
@@ -102,6 +106,7 @@ class StartTest : public testing::Test {
         gIsManagerMissing = false;
         Registry() = fRegistered;
         gPopulationStatus = 0;
+        gAllocationStatus = 0;
     }
 
     static TProviders& Registry() { return ProvidersOf(*TNamespaceProviderManager::GetInstance()); }
@@ -138,6 +143,13 @@ TEST_F(StartTest, AFailureOfThePopulatorLeavesTheAllocation)
     EXPECT_EQ(11, StatusOf([&] { CallsWithRoot("/opt/x"); }));
     gPopulationStatus = TZELStatusCode::kParseError;
     EXPECT_EQ(9, StatusOf([&] { CallsWithRoot("/opt/x"); }));
+}
+
+TEST_F(StartTest, AFailureOfTheStoreProviderLeavesTheAllocation)
+{
+    gAllocationStatus = TZELStatusCode::kOutOfMemory;
+    EXPECT_EQ(4, StatusOf([&] { CallsWithRoot("/opt/x"); }));
+    EXPECT_EQ("AllocateNamespace {} false \"root/cimv2\"\n", fCalls);
 }
 
 TEST_F(StartTest, AMissingStoreProviderFailsTheAssertion)
