@@ -14,6 +14,8 @@ namespace NORVZEL20 {
 
 namespace {
 
+constexpr std::size_t kUsualNumberLength = 10;
+
 const std::string& GetEmptyText()
 {
     static const std::string* const fgEmpty = new std::string;
@@ -127,8 +129,19 @@ void TCIMReference::SetClass(boost::shared_ptr<ICIMClass> cls)
 std::string TCIMReference::GetPath() const
 {
     std::string path;
+    path.reserve(EstimateLength());
     AppendPath(path);
     return path;
+}
+
+std::size_t TCIMReference::EstimateLength() const
+{
+    std::size_t length = GetHost().size() + GetNamespaceName().size() + GetClassName().size() + 4;
+    for (std::size_t i = 0; i < GetKeyCount(); ++i) {
+        const auto& [name, value] = fContents->fBindings[i];
+        length += name.size() + 4 + (TValueAccess::IsText(value) ? TValueAccess::GetText(value).size() : kUsualNumberLength);
+    }
+    return length;
 }
 
 void TCIMReference::AppendPath(std::string& out) const

@@ -18,7 +18,7 @@ class TCIMDateTime {
     /// it is, for any other length, form or range (month 13, hour 24, second 60, a day that its month lacks).
     static bool Parse(std::string_view text, TCIMDateTime& result) noexcept;
 
-    /// The 25 characters, with the offset and the asterisks it was read with.
+    /// The 25 characters, with the offset and the asterisks it was read with ("-000" comes back as "+000").
     std::string ToText() const;
 
     bool IsInterval() const noexcept { return fInterval; }

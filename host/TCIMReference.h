@@ -81,6 +81,8 @@ class TCIMReference {
 
     explicit TCIMReference(TContents* contents) noexcept;
     TContents& Own();
+    /// The length of the path's text where nothing in it needs an escape.
+    std::size_t EstimateLength() const;
 
     TContents* fContents;  // counted; null stands for the empty path
 };
