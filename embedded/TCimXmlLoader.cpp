@@ -4,6 +4,7 @@
 #include <boost/smart_ptr/make_shared.hpp>
 
 #include "embedded/TCimXmlClassMaker.h"
+#include "embedded/TCimXmlObjects.h"
 #include "embedded/TValueText.h"
 
 namespace NORVZEL20 {
@@ -55,9 +56,12 @@ void TCimXmlLoader::AddClass(TCimXmlDraft draft)
                           "found a second, different declaration of class " + Quote(name) + "; remove one");
         return fContext.Tolerate("repeated class", "class " + Quote(name) + " is declared again; the first declaration stands");
     }
-    if (fNamespace->FindClass(name))
-        fContext.Fail(EStatus::kAlreadyExists,
-                      "found class " + Quote(name) + ", which the namespace has already; load into an empty one");
+    if (const boost::shared_ptr<TInMemClass> known = fNamespace->FindClass(name)) {
+        if (TCimXmlObjects::FromClass(*known) != TCimXmlObjects::WithoutInherited(draft.object))
+            fContext.Fail(EStatus::kAlreadyExists,
+                          "found class " + Quote(name) + ", which the namespace declares differently; load into an empty one");
+        return fContext.Tolerate("known class", "class " + Quote(name) + " is in the namespace already, declared the same");
+    }
     fClassNumbers.emplace(name, fClasses.size());
     fClasses.push_back({std::move(draft), TClassDraft::kWaiting});
     fNewClasses = true;
@@ -95,7 +99,7 @@ void TCimXmlLoader::DeclareClass(std::size_t number)
         super = TCimXmlClassMaker(fContext, *fNamespace).Make(waiting.draft, super);
         fStaging.AddClass(super);
         waiting.state = TClassDraft::kDeclared;
-        fDeclaredLate = fDeclaredLate || fNumber > 0;
+        fDeclaredLate = fDeclaredLate || fNumber > 0 || fDeferring;
     }
 }
 

@@ -1,5 +1,6 @@
 #include "embedded/TCimXmlObjects.h"
 
+#include <type_traits>
 #include <utility>
 
 #include "embedded/TInMemClass.h"
@@ -84,7 +85,34 @@ void AddAllElements(TEmbeddedObject& object, const ICIMClass& cls)
     cls.EnumerateMethodDecls(addMethod, TCallContext());
 }
 
+/// Leaves out what is propagated, in the elements' qualifiers too.
+template <class TElement>
+std::vector<TElement> OwnOf(const std::vector<TElement>& elements)
+{
+    std::vector<TElement> own;
+    for (const TElement& element : elements)
+        if (!element.fPropagated)
+            own.push_back(element);
+    if constexpr (!std::is_same_v<TElement, TEmbeddedObject::TQualifier>)
+        for (TElement& element : own)
+            element.fQualifiers = OwnOf(element.fQualifiers);
+    return own;
+}
+
 }  // namespace
+
+TEmbeddedObject TCimXmlObjects::WithoutInherited(const TEmbeddedObject& cls)
+{
+    TEmbeddedObject object(cls.GetClassName(), true);
+    object.SetSuperClassName(cls.GetSuperClassName());
+    for (TEmbeddedObject::TQualifier& qualifier : OwnOf(cls.GetQualifiers()))
+        object.AddQualifier(std::move(qualifier));
+    for (TEmbeddedObject::TProperty& property : OwnOf(cls.GetProperties()))
+        object.AddProperty(std::move(property));
+    for (TEmbeddedObject::TMethod& method : OwnOf(cls.GetMethods()))
+        object.AddMethod(std::move(method));
+    return object;
+}
 
 TEmbeddedObject TCimXmlObjects::FromClass(const ICIMClass& cls)
 {

@@ -15,6 +15,9 @@ class TCimXmlObjects {
     /// it has, inherited elements included, because the interfaces do not tell them apart; parameters it does not show.
     static TEmbeddedObject FromClass(const ICIMClass& cls);
 
+    /// The class without the elements and qualifiers that are marked as propagated from a superclass.
+    static TEmbeddedObject WithoutInherited(const TEmbeddedObject& cls);
+
     /// One property of an instance, without qualifiers.
     static TEmbeddedObject::TProperty FromProperty(const ICIMProperty& property);
 };

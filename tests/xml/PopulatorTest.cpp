@@ -157,6 +157,15 @@ TEST_F(PopulatorTest, ARepeatedClassIsTolerated)
     EXPECT_THAT(L::Tolerated(report), testing::StartsWith("3: class \"A\" is declared again; the first declaration stands (1)\n"));
 }
 
+TEST_F(PopulatorTest, AClassThatIsThereAlreadyIsToleratedWhereItIsTheSame)
+{
+    fLoading.Load(L::Group(L::Class("A", kPropertyS)));
+    const TLoadReport report = fLoading.Load(L::Group(L::Class("A", kPropertyS) + L::Instance("A", "1")));
+    EXPECT_EQ("2: class \"A\" is in the namespace already, declared the same (1)\n", L::Tolerated(report));
+    EXPECT_EQ("doc.xml:2:15: found class \"A\", which the namespace declares differently; load into an empty one",
+              fLoading.ErrorOf(L::Group(L::Class("A"))));
+}
+
 TEST_F(PopulatorTest, EmbeddedObjectsAreReadByTheirMarkOrTheirDeclaration)
 {
     const std::string declared = "<PROPERTY NAME=\"E\" TYPE=\"string\"><QUALIFIER NAME=\"EmbeddedInstance\" TYPE=\"string\">"
