@@ -5,8 +5,9 @@ namespace NORVZEL20 {
 const std::vector<TFuzzTarget>& TFuzzTarget::GetAll()
 {
     static const std::vector<TFuzzTarget> fgTargets = {
-        {"inventory", FuzzInventory},         {"path", FuzzPath},   {"query", FuzzQuery},
-        {"specification", FuzzSpecification}, {"value", FuzzValue},
+        {"arguments", FuzzArguments}, {"engine", FuzzEngine}, {"inventory", FuzzInventory},
+        {"path", FuzzPath},           {"query", FuzzQuery},   {"specification", FuzzSpecification},
+        {"value", FuzzValue},
     };
     return fgTargets;
 }

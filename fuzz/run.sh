@@ -9,6 +9,7 @@ cd "$(dirname "${BASH_SOURCE[0]}")"
 targets=("$@")
 [ $# -gt 0 ] || mapfile -t targets < <(cd corpus && ls)
 work=$(dirname "$bin")/corpus
+findings=$PWD/found
 logs=$(dirname "$bin")/logs
 mkdir -p "$logs"
 export CIMDELTA_ROOT=${CIMDELTA_ROOT:-$(dirname "$PWD")}
@@ -19,7 +20,7 @@ run_target() {
     mkdir -p "$work/$target" "found/$target"
     [ ! -f "dictionaries/$target.dict" ] || dictionary=("-dict=dictionaries/$target.dict")
     "$bin/fuzz_$target" -max_total_time="$seconds" -timeout=20 -rss_limit_mb=3000 -max_len=8192 -print_final_stats=1 \
-        -artifact_prefix="found/$target/" "${dictionary[@]}" "$work/$target" "corpus/$target" >"$logs/$target" 2>&1 || status=$?
+        -artifact_prefix="$findings/$target/" "${dictionary[@]}" "$work/$target" "corpus/$target" >"$logs/$target" 2>&1 || status=$?
     rmdir --ignore-fail-on-non-empty "found/$target"
     echo "$status" >"$logs/$target.status"
 }
