@@ -27,27 +27,26 @@ std::string FindSystemTrouble(const std::vector<TInventory>& inventories)
     return "the first " + std::string(kOperatingSystemClass) + " of " + inventories[0].path + " has no OSType between 0 and 65535";
 }
 
-std::string FindUndeclaredProperty(const TInventory& inventory, const TInMemClass& cls, const std::vector<std::string>& properties)
+// The reason of status 37.
+std::string FindUndeclaredClass(const TInventory& reference, const TInventory& other, TInMemClass& cls,
+                                const std::vector<std::string>&)
 {
+    return cls.GetInstanceCount() > 0 && !other.ns->FindClass(cls.GetName())
+               ? other.path + " does not declare class " + cls.GetName() + ", of which " + reference.path + " has instances"
+               : std::string();
+}
+
+// The reason of status 15.
+std::string FindUndeclaredProperty(const TInventory&, const TInventory& other, TInMemClass& cls,
+                                   const std::vector<std::string>& properties)
+{
+    const boost::shared_ptr<TInMemClass> there = other.ns->FindClass(cls.GetName());
     for (const std::string& property : properties) {
-        if (!cls.FindPropertyDecl(property)) {
-            return inventory.path + " does not declare property " + property + " of class " + cls.GetName();
+        if (there && there->GetInstanceCount() > 0 && !there->FindPropertyDecl(property)) {
+            return other.path + " does not declare property " + property + " of class " + cls.GetName();
         }
     }
     return std::string();
-}
-
-// The reason of status 15 and 37.
-std::string FindUndeclared(const TInventory& reference, const TInventory& other, TInMemClass& cls,
-                           const std::vector<std::string>& properties)
-{
-    const boost::shared_ptr<TInMemClass> there = other.ns->FindClass(cls.GetName());
-    if (there) {
-        return there->GetInstanceCount() > 0 ? FindUndeclaredProperty(other, *there, properties) : std::string();
-    }
-    return cls.GetInstanceCount() > 0
-               ? other.path + " does not declare class " + cls.GetName() + ", of which " + reference.path + " has instances"
-               : std::string();
 }
 
 // The reason of status 13.
@@ -94,8 +93,10 @@ std::string TComparisonFault::Describe(const std::vector<TInventory>& inventorie
         trouble = FindFirst(inventories, rules, FindOtherType);
         break;
     case TZELStatusCode::kNotFound:
+        trouble = FindFirst(inventories, rules, FindUndeclaredProperty);
+        break;
     case TZELStatusCode::kSchemaMismatch:
-        trouble = FindFirst(inventories, rules, FindUndeclared);
+        trouble = FindFirst(inventories, rules, FindUndeclaredClass);
         break;
     default:
         break;

@@ -94,8 +94,9 @@ TEST(RuleTrace, AgreesWithThePlugInOnRandomRules)
 
 std::string WarningsFor(const TRulesDocument& document)
 {
+    const TRuleTrace trace(document, MakeSchema());
     std::string text;
-    for (const TRuleTrace::TWarning& warning : TRuleTrace(document, MakeSchema()).GetWarnings()) {
+    for (const TRuleTrace::TWarning& warning : trace.GetWarnings()) {
         text += std::to_string(warning.line) + " " + warning.text + "\n";
     }
     return text;
