@@ -11,17 +11,17 @@ namespace NORVZEL20 {
 
 namespace {
 
-// The name of the library or program that holds the address, as the loader keeps it; one pointer for each of them.
-const char* HolderOf(const void* address)
+// The library or program that holds the address, as the loader knows it; dladdr would look for the nearest symbol as well.
+const void* HolderOf(const void* address)
 {
-    Dl_info info;
-    return dladdr(address, &info) != 0 ? info.dli_fname : nullptr;
+    dl_find_object found;
+    return _dl_find_object(const_cast<void*>(address), &found) == 0 ? found.dlfo_link_map : nullptr;
 }
 
 // Whether the address lies in the host's own library.
 bool IsOfHost(const void* caller)
 {
-    static const char* const host = HolderOf(reinterpret_cast<const void*>(&boost::assertion_failed));
+    static const void* const host = HolderOf(reinterpret_cast<const void*>(&boost::assertion_failed));
     return HolderOf(caller) == host;
 }
 
