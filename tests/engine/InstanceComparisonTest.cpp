@@ -122,6 +122,14 @@ TEST_F(InstanceComparisonTest, ArraysAreEqualElementByElement)
     EXPECT_EQ("k Tags 1\n", Compare("Tags", array({}), TCIMValue()));
 }
 
+TEST_F(InstanceComparisonTest, TheMastersValueIsTheOneThatIsAskedWhetherItIsEqual)
+{
+    const TCIMValue there(TCIMValue::TCIMType(TCIMValue::TCIMType::kArrayString), 2, {"a", "b"});
+    const TCIMValue back(TCIMValue::TCIMType(TCIMValue::TCIMType::kArrayString), 2, {"b", "a"});
+    EXPECT_EQ("", Compare("Tags", there.AsBag(), back));
+    EXPECT_EQ("k Tags 1\n", Compare("Tags", there, back.AsBag()));
+}
+
 TEST_F(InstanceComparisonTest, ReferencesAreEqualWhereTheirPathsAre)
 {
     EXPECT_EQ("", Compare("Owner", PathTo("root/cimv2", 1, "a"), PathTo("root/cimv2", 1, "a")));
