@@ -55,7 +55,8 @@ class RealInventoriesTest : public ClientTest {
     static std::set<std::string> Found(const std::string& report)
     {
         std::set<std::string> lines;
-        for (const nlohmann::json& difference : nlohmann::json::parse(report)["differences"]) {
+        const nlohmann::json document = nlohmann::json::parse(report);
+        for (const nlohmann::json& difference : document["differences"]) {
             if (difference["class"] != "DEB_Package") {
                 continue;
             }
@@ -76,10 +77,10 @@ TEST_F(RealInventoriesTest, TheReportIsTheListThatCameWithTheData)
     ASSERT_EQ(1, fStatus) << fErr;
     const std::set<std::string> expected = Expected("oracle-ac.tsv.xz");
     ASSERT_GT(expected.size(), 500u);
-    EXPECT_EQ(expected, Found(fOut));
+    EXPECT_TRUE(expected == Found(fOut));
     Run({"compare", "-o", "json", "a.xml.xz", "b.xml.xz"});
     ASSERT_EQ(1, fStatus) << fErr;
-    EXPECT_EQ(Expected("oracle-ab.tsv.xz"), Found(fOut));
+    EXPECT_TRUE(Expected("oracle-ab.tsv.xz") == Found(fOut));
 }
 
 TEST_F(RealInventoriesTest, CountsAgreeOverAllClasses)
