@@ -152,7 +152,7 @@ void TCimXmlLoader::BeginInstance(TLayout& layout)
 }
 
 /// Finds the slot of a property; documents mostly tell them in the order of their declaration.
-TCimXmlLoader::TTarget TCimXmlLoader::FindProperty(std::string_view name)
+TCimXmlLoader::TTarget TCimXmlLoader::FindProperty(const char* name)
 {
     const TInMemClass& cls = *fLayout->cls;
     const std::vector<std::uint32_t>& order = cls.GetSlotOrder();
@@ -259,7 +259,7 @@ void TCimXmlLoader::AddWaiting(const TCimXmlDraft& draft)
     for (std::size_t index = 0; index < object.GetProperties().size(); ++index) {
         const TCimXmlContext::TAt atProperty(fContext, draft.propertyPlaces[index]);
         const TEmbeddedObject::TProperty& property = object.GetProperties()[index];
-        SetProperty(FindProperty(property.fName), TCIMValue(property.fValue), true);
+        SetProperty(FindProperty(property.fName.c_str()), TCIMValue(property.fValue), true);
     }
     EndInstance(&draft.ownKeys);
 }

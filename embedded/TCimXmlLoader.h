@@ -4,7 +4,6 @@
 #include <cstdint>
 #include <memory>
 #include <string>
-#include <string_view>
 #include <utility>
 #include <vector>
 
@@ -41,7 +40,7 @@ class TCimXmlLoader {
 
     /// False where the instance has to be read as a draft.
     bool BeginInstance(const char* className);
-    TTarget FindProperty(std::string_view name);
+    TTarget FindProperty(const char* name);
     /// `metUnknownClass` tells that the value refers to a class that is not known yet.
     void SetProperty(const TTarget& target, TCIMValue&& value, bool metUnknownClass);
     /// `ownKeys` (may be null) fills the keys that the instance itself does not tell.

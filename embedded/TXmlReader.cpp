@@ -13,18 +13,6 @@
 
 namespace NORVZEL20 {
 
-namespace {
-
-std::size_t CountAttributes(const char** attributes)
-{
-    std::size_t count = 0;
-    while (attributes[2 * count] != nullptr)
-        ++count;
-    return count;
-}
-
-}  // namespace
-
 void TXmlReader::TFree::operator()(XML_ParserStruct* parser) const noexcept
 {
     XML_ParserFree(parser);
@@ -53,10 +41,8 @@ struct TXmlReader::TCallbacks {
                 return reader.Refuse("elements are nested too deeply");
             if (static_cast<std::size_t>(XML_GetCurrentByteCount(reader.fParser.get())) > kMaxTokenLength)
                 return reader.Refuse("a tag is too long");
-            if (CountAttributes(attributes) > kMaxAttributes)
-                return reader.Refuse("too many attributes");
-            if (reader.AreDefaultsTooLong(attributes))
-                return reader.Refuse("attribute defaults expand too much");
+            if (const char* reason = reader.FindExcess(attributes))
+                return reader.Refuse(reason);
             reader.HandOverText();
             reader.fSink.OnStart(name, attributes);
             reader.fText.clear();
@@ -151,13 +137,20 @@ void TXmlReader::Reset(const char* encoding)
     fStopped = false;
 }
 
-/// Defaults are declared once and handed out for every element, which the library's own limit does not see.
-bool TXmlReader::AreDefaultsTooLong(const char** attributes)
+/// Why the attributes are too many or too long; null where they are not. Defaults are declared once and handed out for every
+/// element, which the library's own limit does not see.
+const char* TXmlReader::FindExcess(const char** attributes)
 {
-    for (const char** next = attributes + XML_GetSpecifiedAttributeCount(fParser.get()); *next != nullptr; next += 2)
-        fDefaultBytes += std::strlen(next[1]);
-    return fDefaultBytes > kExpansionThreshold &&
-           static_cast<double>(fDefaultBytes) > kMaxAmplification * static_cast<double>(fBytes);
+    const auto specified = static_cast<std::size_t>(XML_GetSpecifiedAttributeCount(fParser.get()));  // names and values
+    std::size_t count = specified;
+    for (; attributes[count] != nullptr; count += 2)
+        fDefaultBytes += std::strlen(attributes[count + 1]);
+    if (count > 2 * kMaxAttributes)
+        return "too many attributes";
+    if (count > specified && fDefaultBytes > kExpansionThreshold &&
+        static_cast<double>(fDefaultBytes) > kMaxAmplification * static_cast<double>(fBytes))
+        return "attribute defaults expand too much";
+    return nullptr;
 }
 
 bool TXmlReader::Parse(const char* data, std::size_t length, bool last)

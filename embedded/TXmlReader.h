@@ -83,7 +83,7 @@ class TXmlReader {
     void Install();
     bool Settle(bool succeeded);
     void Refuse(const char* reason);
-    bool AreDefaultsTooLong(const char** attributes);
+    const char* FindExcess(const char** attributes);
     void HandOverText();
 
     ISink& fSink;
