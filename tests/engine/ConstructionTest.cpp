@@ -132,6 +132,12 @@ TEST_P(ConstructionTest, AMissingInstanceInTheReferenceFailsTheCheck)
     EXPECT_EQ(kCheckFailed, fLog.Take());
 }
 
+TEST_P(ConstructionTest, WithoutAnyNamespaceTheCheckFails)
+{
+    EXPECT_EQ("status 3", Construct());
+    EXPECT_EQ(kCheckFailed, fLog.Take());
+}
+
 TEST_P(ConstructionTest, AMissingPropertyFailsTheCheck)
 {
     fComparison.SetWithOperatingSystem(false);

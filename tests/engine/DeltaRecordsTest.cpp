@@ -4,6 +4,8 @@
 #include "host/TAddToVectorCallback.h"
 #include "tests/engine/TEngineFixture.h"
 #include "tests/support/Dump.h"
+#include "tests/support/TWatchedClass.h"
+#include "tests/support/TWatchedInstance.h"
 #include "tests/support/TWatchedNamespace.h"
 
 namespace NORVZEL20 {
@@ -148,20 +150,60 @@ TEST_P(DeltaRecordsTest, AFailureBeforeTheRecordLeavesNothing)
     EXPECT_EQ("Disk\n", fComparison.Records());
 }
 
-// A delta namespace without any class.
-class TClasslessNamespace : public TWatchedNamespace {
+// A delta namespace that answers for each class with the same one, or with null.
+class TBareNamespace : public TWatchedNamespace {
   public:
-    TClasslessNamespace() : TWatchedNamespace(MakeNamespace(EHost::kPlain, ""), boost::make_shared<TCallWatch>(), "classless") {}
+    explicit TBareNamespace(boost::shared_ptr<ICIMClass> cls)
+        : TWatchedNamespace(MakeNamespace(EHost::kPlain, ""), boost::make_shared<TCallWatch>(), "bare"), fClass(cls)
+    {}
 
-    boost::shared_ptr<ICIMClass> GetClass(const std::string&, TCallContext) override { return nullptr; }
+    boost::shared_ptr<ICIMClass> GetClass(const std::string&, TCallContext) override { return fClass; }
+
+  private:
+    boost::shared_ptr<ICIMClass> fClass;
+};
+
+// A class that allocates the same instance each time, or null.
+class TBareClass : public TWatchedClass {
+  public:
+    TBareClass(boost::shared_ptr<ICIMClass> cls, boost::shared_ptr<ICIMInstance> instance)
+        : TWatchedClass(cls, boost::make_shared<TCallWatch>(), "bare"), fInstance(instance)
+    {}
+
+    boost::shared_ptr<ICIMInstance> AllocateInstance(TCallContext) override { return fInstance; }
+
+  private:
+    boost::shared_ptr<ICIMInstance> fInstance;
+};
+
+// An instance that lacks all its properties.
+class TBareInstance : public TWatchedInstance {
+  public:
+    explicit TBareInstance(boost::shared_ptr<ICIMInstance> instance)
+        : TWatchedInstance(instance, boost::make_shared<TCallWatch>(), "bare", "bare")
+    {}
+
+    boost::shared_ptr<ICIMProperty> GetProperty(const std::string&, TCallContext) const override { return nullptr; }
 };
 
 TEST_P(DeltaRecordsTest, ANullClassFailsTheAssertion)
 {
-    TEngine engine(boost::make_shared<TClasslessNamespace>(), fNamespaces, "|fVMWareEnable");
+    TEngine engine(boost::make_shared<TBareNamespace>(nullptr), fNamespaces, "|fVMWareEnable");
     EXPECT_THROW(engine.createCIMDiff(fRecord, kChanged, "i", "p", {1}), TAssertionFailure);
     EXPECT_NE(std::string::npos, fLog.Take().find("px != 0"));
     EXPECT_THROW(engine.createObjectPathAlias("Disk", "k", PathTo("", 1, "a"), 0), TAssertionFailure);
+}
+
+TEST_P(DeltaRecordsTest, ANullInstanceOrPropertyFailsTheAssertion)
+{
+    const auto cls = fComparison.Delta().GetClass("KALMO_Delta", fNone);
+    const std::vector<boost::shared_ptr<ICIMInstance>> answers{nullptr, boost::make_shared<TBareInstance>(fRecord)};
+    for (const auto& answer : answers) {
+        const auto bare = boost::make_shared<TBareNamespace>(boost::make_shared<TBareClass>(cls, answer));
+        TEngine engine(bare, fNamespaces, "|fVMWareEnable");
+        EXPECT_THROW(engine.createCIMDiff(fRecord, kChanged, "i", "p", {1}), TAssertionFailure);
+        EXPECT_NE(std::string::npos, fLog.Take().find("px != 0"));
+    }
 }
 
 TEST_P(DeltaRecordsTest, ANullRecordFailsTheAssertionAfterItsDelta)

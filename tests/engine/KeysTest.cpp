@@ -1,5 +1,8 @@
+#include <boost/smart_ptr/make_shared.hpp>
+
 #include "embedded/TAssertionFailure.h"
 #include "tests/engine/TEngineFixture.h"
+#include "tests/support/TWatchedInstance.h"
 
 namespace NORVZEL20 {
 namespace {
@@ -86,6 +89,24 @@ TEST_P(KeysTest, ErrorsOfTheHostPassThrough)
     const auto disk = Disk(0, {{"Id", "sda"}, {"Bus", 1u}});
     Watch().FailCallsOf("ns0:Disk.EnumerateKeyNames", TZELStatusCode::kNamespaceGone);
     EXPECT_EQ("status 18", OutcomeOf([&] { Engine().buildPath(RulesWithout(""), disk); }));
+}
+
+// An instance that lacks all its properties.
+class TBareInstance : public TWatchedInstance {
+  public:
+    explicit TBareInstance(boost::shared_ptr<ICIMInstance> instance)
+        : TWatchedInstance(instance, boost::make_shared<TCallWatch>(), "bare", "bare")
+    {}
+
+    boost::shared_ptr<ICIMProperty> GetProperty(const std::string&, TCallContext) const override { return nullptr; }
+};
+
+TEST_P(KeysTest, AKeyPropertyThatIsNullFailsTheAssertion)
+{
+    const auto bare = boost::make_shared<TBareInstance>(Disk(0, {{"Id", "sda"}, {"Bus", 1u}}));
+    EXPECT_THROW(Engine().buildPath(RulesWithout("Bus"), bare), TAssertionFailure);
+    EXPECT_NE(std::string::npos, fLog.Take().find("px != 0"));
+    EXPECT_EQ("Disk", Engine().buildPath(RulesWithout("Bus Id"), bare));
 }
 
 TEST_P(KeysTest, NullRulesFailTheAssertion)

@@ -1,4 +1,9 @@
+#include <boost/smart_ptr/make_shared.hpp>
+#include <typeinfo>
+
+#include "host/TZELException.h"
 #include "tests/engine/TPerClassFixture.h"
+#include "tests/support/TWatchedNamespace.h"
 
 namespace NORVZEL20 {
 namespace {
@@ -80,9 +85,45 @@ TEST_P(SchemaCheckTest, AnotherFailureKeepsItsStatus)
     EXPECT_EQ("", fLog.Take());
 }
 
+struct TSpecialException : TZELException {
+    using TZELException::TZELException;
+};
+
+// A namespace that fails in its own way when it is asked for a Card.
+class TCardlessNamespace : public TWatchedNamespace {
+  public:
+    explicit TCardlessNamespace(boost::shared_ptr<ICIMNamespace> ns)
+        : TWatchedNamespace(ns, boost::make_shared<TCallWatch>(), "cardless")
+    {}
+
+    boost::shared_ptr<ICIMClass> GetClass(const std::string& name, TCallContext context) override
+    {
+        if (name == "Card") {
+            throw TSpecialException(TZELStatusCode::kNamespaceGone);
+        }
+        return TWatchedNamespace::GetClass(name, context);
+    }
+};
+
+TEST_P(SchemaCheckTest, AnotherFailureIsThrownAnew)
+{
+    Card(0);
+    Card(1);
+    fComparison.Prepare();
+    fComparison.Delta().AddNamespaceToCompareList(boost::make_shared<TCardlessNamespace>(Namespace(1).GetNamespace()));
+    try {
+        fComparison.Delta().FindDifferences();
+        FAIL() << "nothing was thrown";
+    } catch (const TZELException& error) {
+        EXPECT_EQ(TZELStatusCode::kNamespaceGone, error.GetStatusCode().GetStatus());
+        EXPECT_EQ(typeid(TZELException), typeid(error));
+    }
+}
+
 TEST_P(SchemaCheckTest, AReferenceWithoutItsRootEndsTheRun)
 {
-    Namespace(1);
+    Card(0);
+    Card(1);
     fComparison.GetWatch().FailCallsOf("ns0.GetClass(\"<root>\")", TZELStatusCode::kNotFound);
     EXPECT_EQ("status 15\n", RecordsAfterRun());
 }

@@ -55,6 +55,15 @@ TEST_P(TwoNamespacesTest, WhatTheOtherLacksStaysAndIsMarked)
     EXPECT_EQ(0u, fComparison.GetWatch().CountOf("Label.MarkRemoved()"));
 }
 
+TEST_P(TwoNamespacesTest, WhatTheOtherLacksIsMarkedWhereKeysAreExcludedToo)
+{
+    Rules("<class name=\"Disk\" default=\"include\" excludekeys=\"Bus\"/>");
+    Disk(0, "sda", 1, 3);
+    Namespace(1);
+    EXPECT_EQ("Disk\n  1 root/cimv2:Disk.Bus=3,Id=\"sda\" [1]\n", RecordsAfterRun());
+    EXPECT_EQ(3u, fComparison.GetWatch().CountOf(".MarkRemoved()"));
+}
+
 TEST_P(TwoNamespacesTest, ASecondRunFindsOnlyWhatTheOtherLacks)
 {
     Disk(0, "sda", 1);

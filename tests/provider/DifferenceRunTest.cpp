@@ -76,6 +76,21 @@ TEST(UnownedRunTest, ANamespaceThatNobodyOwnsCannotRun)
     EXPECT_THROW(byNew->FindDifferences(), boost::bad_weak_ptr);
 }
 
+TEST(UnownedRunTest, NobodyIsAskedForAnything)
+{
+    TCapturingLogger log;
+    TComparison comparison(EHost::kPlain);
+    comparison.SetNamespaceCount(2);
+    TDeltaNamespace onStack;
+    for (const auto& ns : comparison.AllWatched()) {
+        onStack.AddNamespaceToCompareList(ns);
+    }
+    onStack.SetSpecFileName("/nonexistent/rules.xml");
+    EXPECT_THROW(onStack.FindDifferences(), boost::bad_weak_ptr);
+    EXPECT_EQ("", comparison.GetWatch().TakeText());
+    EXPECT_EQ("", log.Take());
+}
+
 TEST(QueryTest, RecordsOfEveryRunAnswerQueries)
 {
     TComparison comparison(EHost::kInmem);

@@ -4,6 +4,7 @@
 #include "provider/TDeltaNamespaceProvider.h"
 #include "tests/provider/TDeltaFixture.h"
 #include "tests/support/TTestAccess.h"
+#include "tests/support/TWatchedNamespace.h"
 
 namespace NORVZEL20 {
 namespace {
@@ -114,6 +115,29 @@ TEST(LifecycleTest, DestructionReleasesStoreAndComparedNamespaces)
     delta.reset();
     EXPECT_TRUE(store.expired());
     EXPECT_TRUE(weakCompared.expired());
+}
+
+// A namespace that notes its end.
+class TMortalNamespace : public TWatchedNamespace {
+  public:
+    TMortalNamespace(const std::string& name, std::string& ends)
+        : TWatchedNamespace(MakeNamespace(EHost::kPlain, name), boost::make_shared<TCallWatch>(), name), fName(name), fEnds(ends)
+    {}
+    ~TMortalNamespace() override { fEnds += fName + " "; }
+
+  private:
+    std::string fName;
+    std::string& fEnds;
+};
+
+TEST(LifecycleTest, TheStoreIsReleasedBeforeTheComparedNamespaces)
+{
+    std::string ends;
+    auto delta = WithoutStore();
+    delta->AddNamespaceToCompareList(boost::make_shared<TMortalNamespace>("compared", ends));
+    TTestAccess::SetStore(*delta, boost::make_shared<TMortalNamespace>("store", ends));
+    delta.reset();
+    EXPECT_EQ("store compared ", ends);
 }
 
 TEST(LifecycleTest, AssignmentCopiesNothing)

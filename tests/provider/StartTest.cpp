@@ -1,5 +1,8 @@
 #include <dlfcn.h>
 
+#include <boost/smart_ptr/make_shared.hpp>
+#include <boost/smart_ptr/weak_ptr.hpp>
+
 #include "host/TNamespacePopulator.h"
 #include "host/TNamespaceProviderManager.h"
 #include "host/TOSSpecific.h"
@@ -17,6 +20,7 @@ namespace NORVZEL20 {
 namespace {
 
 bool gIsManagerMissing = false;
+int gRegistrationStatus = 0;
 int gPopulationStatus = 0;
 int gAllocationStatus = 0;
 const char* gRoot = "";
@@ -48,13 +52,27 @@ class TTellingProvider : public INamespaceProvider {
         if (gAllocationStatus != 0) {
             throw TZELException(static_cast<TZELStatusCode::EStatusCode>(gAllocationStatus));
         }
-        return TPlainNamespace::Create(name);
+        const auto store = TPlainNamespace::Create(name);
+        fStore = store;
+        return store;
     }
     int GetType(TCallContext) const override { return 0; }
     bool IsIndicationsSupported(TCallContext) const override { return false; }
 
+    bool IsStoreGone() const { return fStore.expired(); }
+
   private:
     std::string fName = "inmem";
+    mutable boost::weak_ptr<ICIMNamespace> fStore;  // the one allocated last
+};
+
+// A manager that fails to register.
+class TFailingManager : public INamespaceProviderManager {
+  public:
+    TZELStatusCode RegisterProvider(boost::shared_ptr<INamespaceProvider>) override
+    {
+        throw TZELException(static_cast<TZELStatusCode::EStatusCode>(gRegistrationStatus));
+    }
 };
 
 }  // namespace
@@ -63,6 +81,9 @@ boost::shared_ptr<INamespaceProviderManager> TRootObject::GetNamespaceProviderMa
 {
     if (gIsManagerMissing) {
         return nullptr;
+    }
+    if (gRegistrationStatus != 0) {
+        return boost::make_shared<TFailingManager>();
     }
     using TOperation = boost::shared_ptr<INamespaceProviderManager> (*)();
     return Original<TOperation>("_ZN9NORVZEL2011TRootObject27GetNamespaceProviderManagerEv")();
@@ -96,14 +117,15 @@ namespace {
 
 class StartTest : public testing::Test {
   protected:
-    StartTest() : fRegistered(Registry())
+    StartTest() : fProvider(new TTellingProvider), fRegistered(Registry())
     {
         gCalls = &fCalls;
-        Registry() = {boost::shared_ptr<INamespaceProvider>(new TTellingProvider)};
+        Registry() = {fProvider};
     }
     ~StartTest() override
     {
         gIsManagerMissing = false;
+        gRegistrationStatus = 0;
         Registry() = fRegistered;
         gPopulationStatus = 0;
         gAllocationStatus = 0;
@@ -120,6 +142,7 @@ class StartTest : public testing::Test {
     }
 
     std::string fCalls;
+    const boost::shared_ptr<TTellingProvider> fProvider;
     const TProviders fRegistered;
 };
 
@@ -145,6 +168,18 @@ TEST_F(StartTest, AFailureOfThePopulatorLeavesTheAllocation)
     EXPECT_EQ(9, StatusOf([&] { CallsWithRoot("/opt/x"); }));
 }
 
+TEST_F(StartTest, AFailureOfThePopulatorLeavesNothingBehind)
+{
+    const TProviders before = Registry();
+    gPopulationStatus = TZELStatusCode::kParseError;
+    EXPECT_EQ(9, StatusOf([&] { CallsWithRoot("/opt/x"); }));
+    EXPECT_EQ("AllocateNamespace {} false \"root/cimv2\"\n"
+              "PopulateFromXMLFile store /opt/x/data/deltaclasses.properties.xml\n",
+              fCalls);
+    EXPECT_TRUE(fProvider->IsStoreGone());
+    EXPECT_EQ(before, Registry());
+}
+
 TEST_F(StartTest, AFailureOfTheStoreProviderLeavesTheAllocation)
 {
     gAllocationStatus = TZELStatusCode::kOutOfMemory;
@@ -163,6 +198,12 @@ TEST_F(StartTest, AMissingManagerFailsTheAssertion)
     gIsManagerMissing = true;
     EXPECT_TRUE(FailsOnNull([&] { CallsWithRoot("/opt/x"); }));
     EXPECT_TRUE(FailsOnNull([] { TDeltaNamespaceProvider::Initialize(); }));
+}
+
+TEST_F(StartTest, AFailureOfTheRegistrationIsPassedOn)
+{
+    gRegistrationStatus = TZELStatusCode::kOutOfMemory;
+    EXPECT_EQ(4, StatusOf([] { TDeltaNamespaceProvider::Initialize(); }));
 }
 
 TEST_F(StartTest, TheConstructorWithAnArgumentAsksTheHostForNothing)

@@ -174,6 +174,15 @@ TEST_F(RulesetTest, TheParentsRulesAreAddedWhereAParentIsNamed)
               DumpRules(fRuleset));
 }
 
+TEST_F(RulesetTest, AParentWithoutRulesIsEnteredWithNone)
+{
+    TCapturingLogger log;
+    EXPECT_THROW(fRuleset.updateRuleset("Mid", "Base", fSchema), TAssertionFailure);
+    ASSERT_EQ(1u, fRuleset.fRules.count("Base"));
+    EXPECT_EQ(nullptr, fRuleset.fRules["Base"]);
+    EXPECT_EQ("", fWatch->TakeText());
+}
+
 TEST_F(RulesetTest, TheWalkAsksForEachClassAndItsDirectSubclassesDepthFirst)
 {
     fRuleset.addToRuleset("Base", Rules(INCLUDE, {}), true);

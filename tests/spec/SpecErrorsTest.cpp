@@ -1,8 +1,10 @@
 #include <boost/smart_ptr/make_shared.hpp>
+#include <typeinfo>
 
 #include "host/TZELException.h"
 #include "spec/TDiffXMLParser.h"
 #include "tests/spec/TSpecFixture.h"
+#include "tests/support/TWatchedNamespace.h"
 
 namespace NORVZEL20 {
 namespace {
@@ -157,6 +159,58 @@ TEST_F(SpecErrorsTest, AnotherFailureOfThePropertyLookUpKeepsItsStatus)
     fComparison.GetWatch().FailCallsOf("ns0:Other.GetPropertyDecl(\"A\")", TZELStatusCode::kTypeMismatch);
     EXPECT_EQ("status 13", Read(InValue("A")));
     EXPECT_EQ(BarrierEntry(EEvent::kEnd, TZELStatusCode::kTypeMismatch, 4), TakeLog());
+}
+
+TEST_F(SpecErrorsTest, AClassThatIsGoneWhenItsPropertyIsLookedUpMakesThePropertyInvalid)
+{
+    fComparison.GetWatch().FailCall(2, TZELStatusCode::kNotFound);
+    EXPECT_EQ("status 9", Read(InValue("A")));
+    EXPECT_EQ(BothEntries({InValue("A"), 4, "Invalid property \"A\" specified on line #\n", EEvent::kEnd}), TakeLog());
+}
+
+TEST_F(SpecErrorsTest, AnotherFailureOfThePropertysClassLookUpKeepsItsStatus)
+{
+    fComparison.GetWatch().FailCall(2, TZELStatusCode::kNamespaceGone);
+    EXPECT_EQ("status 18", Read(InValue("A")));
+    EXPECT_EQ(BarrierEntry(EEvent::kEnd, TZELStatusCode::kNamespaceGone, 4), TakeLog());
+}
+
+struct TSpecialException : TZELException {
+    using TZELException::TZELException;
+};
+
+// A schema that has its class once, and then fails in its own way.
+class TFadingSchema : public TWatchedNamespace {
+  public:
+    explicit TFadingSchema(boost::shared_ptr<ICIMNamespace> ns) : TWatchedNamespace(ns, boost::make_shared<TCallWatch>(), "fading")
+    {}
+
+    boost::shared_ptr<ICIMClass> GetClass(const std::string& name, TCallContext context) override
+    {
+        if (++fTimes > 1) {
+            throw TSpecialException(TZELStatusCode::kNamespaceGone);
+        }
+        return TWatchedNamespace::GetClass(name, context);
+    }
+
+  private:
+    int fTimes = 0;
+};
+
+TEST_F(SpecErrorsTest, AFailureOfTheSchemaIsThrownAnew)
+{
+    TCIMDiffEngine::TDiffXMLParser parser(boost::make_shared<TFadingSchema>(fComparison.Namespace(0).GetNamespace()));
+    std::map<std::string, std::string> attrs;
+    parser.StartElement("DifftoolSpec", attrs);
+    attrs["name"] = "Other";
+    parser.StartElement("class", attrs);
+    try {
+        parser.EndElement("class");
+        FAIL() << "nothing was thrown";
+    } catch (const TZELException& error) {
+        EXPECT_EQ(TZELStatusCode::kNamespaceGone, error.GetStatusCode().GetStatus());
+        EXPECT_EQ(typeid(TZELException), typeid(error));
+    }
 }
 
 TEST_F(SpecErrorsTest, AFailureOfThePushDownKeepsItsStatus)
