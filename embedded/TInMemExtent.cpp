@@ -1,6 +1,7 @@
 #include "embedded/TInMemExtent.h"
 
 #include <limits>
+#include <new>
 
 #include "embedded/TInMemClass.h"
 #include "host/TZELException.h"
@@ -152,9 +153,18 @@ bool TInMemExtent::Remove(const TInMemInstance& instance)
     fInstances[ordinal].reset();
     --fCount;
     if (fEnumerations == 0 && fInstances.size() > 32 && fCount < fInstances.size() / 2) {
-        Compact();
+        CompactIfPossible();
     }
     return true;
+}
+
+/// The instance is gone; where memory is short, the next removal tidies up.
+void TInMemExtent::CompactIfPossible() noexcept
+{
+    try {
+        Compact();
+    } catch (const std::bad_alloc&) {
+    }
 }
 
 void TInMemExtent::Compact()

@@ -57,6 +57,7 @@ class TInMemExtent {
     void FillGenerated(TInMemInstance& instance);
     void CountGenerated(const TInMemInstance& instance) noexcept;
     void Compact();
+    void CompactIfPossible() noexcept;
 
     const TInMemClass& fClass;
     std::vector<boost::shared_ptr<TInMemInstance>> fInstances;  // null where one was removed

@@ -1,0 +1,133 @@
+#include <gtest/gtest.h>
+
+#include "embedded/TInMemProperty.h"
+#include "tests/faults/FailEachAllocation.h"
+#include "tests/support/Dump.h"
+#include "tests/support/TComparison.h"
+
+namespace NORVZEL20 {
+namespace {
+
+using EType = TCIMValue::TCIMType::ECIMType;
+using TChange = std::function<void(ICIMNamespace&)>;
+
+const TCallContext kNone;
+const char kLong[] = "a value that is too long to be held inside";
+const int kDisks = 40;
+
+/// Disks and solid ones, enough of them to make the store tidy up when some go.
+boost::shared_ptr<ICIMNamespace> MakeDisks()
+{
+    TNamespaceBuilder builder(MakeNamespace(EHost::kInmem, "root/cimv2"));
+    builder.Class("Disk", "", {TNamespaceBuilder::Key("Id"), TNamespaceBuilder::Property("Note")});
+    builder.Class("Ssd", "Disk", {TNamespaceBuilder::Property("Wear", EType::kUint8)});
+    for (int number = 0; number < kDisks; ++number) {
+        builder.Instance("Disk", {{"Id", std::to_string(number)}, {"Note", kLong}});
+    }
+    return builder.Instance("Ssd", {{"Id", "solid"}}).GetNamespace();
+}
+
+TCIMReference PathOf(const std::string& id)
+{
+    TCIMReference path;
+    path.SetClassName("Disk");
+    path.AddKeyValue("Id", TCIMValue(id));
+    return path;
+}
+
+/// The instances, with the earlier values of properties that were marked as changed.
+std::string DumpStore(boost::shared_ptr<ICIMNamespace> ns)
+{
+    std::string text = DumpInstances(ns, "Disk") + DumpInstances(ns, "Ssd");
+    const auto append = [&text](boost::shared_ptr<ICIMInstance> instance) {
+        const auto note = boost::dynamic_pointer_cast<TInMemProperty>(instance->GetProperty("Note", kNone));
+        text += note->IsChanged() ? "was " + note->GetEarlierValue()->ToText() + "\n" : "";
+        return true;
+    };
+    ns->GetClass("Disk", kNone)->EnumerateInstances(append, false, kNone);
+    return text;
+}
+
+/// One change of a store, made wholly or not at all.
+class TChangeStore : public IFaultyAction {
+  public:
+    explicit TChangeStore(TChange change) : fChange(change), fBefore(DumpStore(fStore)) {}
+
+    void Act() override { fChange(*fStore); }
+
+    void Verify(const std::string& outcome) override
+    {
+        if (outcome.empty()) {
+            EXPECT_NE(fBefore, DumpStore(fStore));
+            return;
+        }
+        EXPECT_EQ(fBefore, DumpStore(fStore));
+        fChange(*fStore);
+        EXPECT_NE(fBefore, DumpStore(fStore));
+    }
+
+  private:
+    boost::shared_ptr<ICIMNamespace> fStore = MakeDisks();
+    TChange fChange;
+    std::string fBefore;
+};
+
+std::string FailEach(const std::string& name, TChange change)
+{
+    return FailEachAllocation(name, [&] { return std::make_unique<TChangeStore>(change); });
+}
+
+TEST(StoreOutOfMemory, MarkingAPropertyChangesAndRemembersOrNeither)
+{
+    EXPECT_EQ("bad_alloc", FailEach("MarkChanged", [](ICIMNamespace& ns) {
+                  ns.GetInstance(PathOf("3"), kNone)->GetProperty("Note", kNone)->MarkChanged(TCIMValue(std::string(kLong) + "!"));
+              }));
+}
+
+TEST(StoreOutOfMemory, SettingAKeyKeepsTheInstanceInItsPlace)
+{
+    EXPECT_EQ("bad_alloc", FailEach("SetKey", [](ICIMNamespace& ns) {
+                  ns.GetInstance(PathOf("3"), kNone)->GetProperty("Id", kNone)->SetValue(TCIMValue(kLong), kNone);
+              }));
+}
+
+TEST(StoreOutOfMemory, AddingAnInstanceAddsItOrNot)
+{
+    EXPECT_EQ("bad_alloc", FailEach("AddToNamespace", [](ICIMNamespace& ns) {
+                  const auto instance = ns.GetClass("Disk", kNone)->AllocateInstance(kNone);
+                  instance->GetProperty("Id", kNone)->SetValue(TCIMValue(kLong), kNone);
+                  instance->AddToNamespace(kNone);
+              }));
+}
+
+TEST(StoreOutOfMemory, ModifyingAnInstanceModifiesItOrNot)
+{
+    EXPECT_EQ("bad_alloc", FailEach("ModifyInstance", [](ICIMNamespace& ns) {
+                  ns.ModifyInstance(PathOf("3"), {{"Note", std::string(kLong) + "!"}}, kNone);
+              }));
+}
+
+TEST(StoreOutOfMemory, DeletingAnInstanceDeletesItOrNot)
+{
+    EXPECT_EQ("bad_alloc", FailEach("DeleteInstance", [](ICIMNamespace& ns) { ns.DeleteInstance(PathOf("3"), kNone); }));
+}
+
+TEST(StoreOutOfMemory, TidyingUpAfterDeletionsCanWait)
+{
+    const auto store = MakeDisks();
+    for (int number = 0; number < kDisks; ++number) {
+        const TCIMReference path = PathOf(std::to_string(number));
+        std::size_t allocation = 0;
+        std::string outcome;
+        do {
+            TFailingAllocator::Fail(++allocation);
+            outcome = OutcomeOf([&] { store->DeleteInstance(path, kNone); });
+        } while (outcome == "bad_alloc");
+        ASSERT_EQ("", outcome) << number;
+        ASSERT_EQ("status 15", OutcomeOf([&] { store->GetInstance(path, kNone); })) << number;
+    }
+    EXPECT_EQ("", DumpInstances(store, "Disk"));
+}
+
+}  // namespace
+}  // namespace NORVZEL20
