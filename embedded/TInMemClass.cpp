@@ -141,12 +141,7 @@ bool TInMemClass::IsAbstract(TCallContext) const
 
 bool TInMemClass::IsAbstract() const
 {
-    // Abstract is never inherited, whatever flavor it was written with.
-    TInMemQualifierSet own;
-    if (auto qualifier = GetQualifiers().FindOwn("Abstract")) {
-        own.Add(std::move(qualifier));
-    }
-    return own.IsTrue("Abstract");
+    return GetQualifiers().IsOwnTrue("Abstract");  // never inherited, whatever flavor it was written with
 }
 
 bool TInMemClass::IsPseudoClass() const noexcept

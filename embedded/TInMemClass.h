@@ -34,7 +34,8 @@ class TInMemClass final : public TInMemNamedElement<ICIMClass>, public boost::en
                                                  boost::shared_ptr<TInMemClass> superClass);
     TInMemClass(const TInMemClass&) = delete;
 
-    /// Errors: status 12 where the name is taken, 15 where the superclass is not declared, 18 where the namespace is gone.
+    /// Errors: status 12 where the name is taken, 13 where the superclass has got one of its properties with another type, 15 where
+    /// the superclass is not declared, 18 where the namespace is gone.
     void Validate(TCallContext context) const override;
     void AddToNamespace(TCallContext context) override;
     void RemoveFromNamespace(TCallContext context) override;
@@ -157,7 +158,9 @@ class TInMemClass final : public TInMemNamedElement<ICIMClass>, public boost::en
     void InheritDecl(std::string_view name);
     void AppendSlot(const boost::shared_ptr<TInMemPropertyDecl>& decl);
     void CheckOverrides(const TInMemPropertyDecl& decl) const;
+    void ReserveSlot();
     void DeclChanged(const TInMemPropertyDecl& decl);
+    void DeclChanged(const TInMemPropertyDecl& decl, const std::vector<boost::shared_ptr<TInMemClass>>& below);
     void MethodChanged(std::string_view name);
     void UpdateLayout();
     void UpdateOrder();

@@ -102,13 +102,31 @@ void TInMemClass::AppendSlot(const boost::shared_ptr<TInMemPropertyDecl>& decl)
     fSlotIndex.Add(TNameText::Hash(decl->GetName()), slot);
 }
 
+/// Makes room, so that one slot more, a key too, can be added without a failure.
+void TInMemClass::ReserveSlot()
+{
+    const auto reserve = [](auto& list) {
+        if (list.size() == list.capacity()) {
+            list.reserve(2 * list.size() + 1);
+        }
+    };
+    reserve(fSlots);
+    reserve(fOrder);
+    reserve(fKeySlots);
+    fSlotIndex.Reserve(fSlots.size() + 1);
+}
+
 void TInMemClass::DeclChanged(const TInMemPropertyDecl& decl)
 {
-    const std::string name = decl.GetName();
-    InheritDecl(name);
+    DeclChanged(decl, GetClassesBelow());
+}
+
+void TInMemClass::DeclChanged(const TInMemPropertyDecl& decl, const std::vector<boost::shared_ptr<TInMemClass>>& below)
+{
+    InheritDecl(decl.GetName());
     UpdateLayout();
-    for (const auto& cls : GetClassesBelow()) {
-        cls->InheritDecl(name);
+    for (const auto& cls : below) {
+        cls->InheritDecl(decl.GetName());
         cls->UpdateLayout();
     }
 }
@@ -122,31 +140,38 @@ void TInMemClass::UpdateLayout()
 
 void TInMemClass::UpdateOrder()
 {
-    std::vector<std::uint32_t> order;
-    order.reserve(fSlots.size());
+    fOrder.reserve(fSlots.size());
+    fOrder.clear();
     if (fSuper) {
         for (const std::uint32_t slot : fSuper->fOrder) {
-            order.push_back(FindSlot(fSuper->fSlots[slot]->GetName()));
+            fOrder.push_back(FindSlot(fSuper->fSlots[slot]->GetName()));
         }
     }
     for (const auto& own : fOwn) {
         if (!own->GetOverridden()) {
-            order.push_back(FindSlot(own->GetName()));
+            fOrder.push_back(FindSlot(own->GetName()));
         }
     }
-    fOrder.swap(order);
 }
 
 void TInMemClass::UpdateKeys()
 {
-    std::vector<std::uint32_t> keys;
-    std::copy_if(fOrder.begin(), fOrder.end(), std::back_inserter(keys),
-                 [this](std::uint32_t slot) { return fSlots[slot]->IsKey(); });
-    if (keys == fKeySlots) {
-        return;
+    // In place, because nothing may fail once a declaration has been added.
+    std::size_t count = 0;
+    bool changed = false;
+    for (const std::uint32_t slot : fOrder) {
+        if (!fSlots[slot]->IsKey()) {
+            continue;
+        }
+        if (count == fKeySlots.size()) {
+            fKeySlots.push_back(kNoSlot);
+        }
+        changed = changed || fKeySlots[count] != slot;
+        fKeySlots[count++] = slot;
     }
-    fKeySlots.swap(keys);
-    if (fExtent) {
+    changed = changed || count < fKeySlots.size();
+    fKeySlots.resize(count);
+    if (changed && fExtent) {
         fExtent->Reindex();
     }
 }
@@ -216,10 +241,15 @@ bool TInMemClass::AddPropertyDecl(boost::shared_ptr<ICIMPropertyDecl> decl)
         throw TZELException(TZELStatusCode::kInvalidParameter);
     }
     CheckOverrides(*own);
+    const auto below = GetClassesBelow();
+    ReserveSlot();
+    for (const auto& cls : below) {
+        cls->ReserveSlot();
+    }
     fOwn.push_back(own);
     own->fOwner = weak_from_this();
     if (there || !fSubClasses.empty()) {
-        DeclChanged(*own);
+        DeclChanged(*own, below);
         return true;
     }
     // The common case while a class is built, without going over all that it has already.
@@ -242,9 +272,10 @@ bool TInMemClass::RemovePropertyDecl(boost::shared_ptr<ICIMPropertyDecl> decl)
     if (own->IsKey() && !own->GetOverridden() && HasInstances()) {
         throw TZELException(TZELStatusCode::kClassInUse);
     }
+    const auto below = GetClassesBelow();
     fOwn.erase(at);
     own->fOwner.reset();
-    DeclChanged(*own);
+    DeclChanged(*own, below);
     return true;
 }
 

@@ -5,7 +5,6 @@
 
 #include "embedded/TInMemNamespaceProvider.h"
 #include "embedded/TQuery.h"
-#include "embedded/TValueText.h"
 #include "host/TZELException.h"
 
 namespace NORVZEL20 {
@@ -121,6 +120,12 @@ void TInMemNamespace::CheckNew(const TInMemClass& cls) const
     }
     if (cls.fSuper && !cls.fSuper->IsDeclared()) {
         throw TZELException(TZELStatusCode::kNotFound);
+    }
+    for (const auto& own : cls.fOwn) {
+        const auto inherited = cls.fSuper ? cls.fSuper->FindPropertyDecl(own->GetName()) : nullptr;
+        if (inherited && inherited->GetType() != own->GetType()) {
+            throw TZELException(TZELStatusCode::kTypeMismatch);
+        }
     }
 }
 

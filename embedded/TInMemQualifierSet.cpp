@@ -76,11 +76,16 @@ bool TInMemQualifierSet::IsTrue(std::string_view name) const
     return qualifier && HoldsTrue(*qualifier);
 }
 
+bool TInMemQualifierSet::IsOwnTrue(std::string_view name) const
+{
+    const auto own = FindOwn(name);
+    return own && HoldsTrue(*own);
+}
+
 bool TInMemQualifierSet::IsTrueAnywhere(std::string_view name) const
 {
     for (const TInMemQualifierSet* set = this; set; set = set->fParent) {
-        const auto own = set->FindOwn(name);
-        if (own && HoldsTrue(*own)) {
+        if (set->IsOwnTrue(name)) {
             return true;
         }
     }

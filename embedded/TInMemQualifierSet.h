@@ -29,6 +29,8 @@ class TInMemQualifierSet {
     const std::vector<boost::shared_ptr<ICIMQualifier>>& GetOwn() const noexcept { return fOwn; }
     /// Whether there is one of that name, own or inherited, with the value TRUE.
     bool IsTrue(std::string_view name) const;
+    /// Whether the element itself has one of that name with the value TRUE.
+    bool IsOwnTrue(std::string_view name) const;
     /// Whether the element or any that it stems from has one of that name with the value TRUE, whatever its flavor.
     bool IsTrueAnywhere(std::string_view name) const;
 

@@ -23,7 +23,7 @@ class TInMemStaging {
 
     /// Errors: status 12 where one of that name is declared. After an error of these three the staging may go on.
     void AddQualifierDecl(const boost::shared_ptr<TInMemQualifierDecl>& decl);
-    /// A class allocated from the namespace, its superclass declared. Errors: status 12, 15.
+    /// A class allocated from the namespace, its superclass declared. Errors: status 12, 13, 15.
     void AddClass(const boost::shared_ptr<TInMemClass>& cls);
     /// Errors: status 12 where one with the same keys is there (GetReference then tells its path), 14 where a key is null
     /// (FindMissingKey then tells its name), 15 where the class is not declared.

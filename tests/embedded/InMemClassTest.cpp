@@ -107,6 +107,15 @@ TEST_F(InMemClassTest, AnOverrideOfAnotherTypeIsRefusedFromAboveAndBelow)
     EXPECT_EQ("Id Size", PropertiesOf(*disk));
 }
 
+TEST_F(InMemClassTest, ASuperclassThatGotAnotherTypeMeanwhileKeepsAClassOut)
+{
+    const auto tape = Allocate("Tape", device, {{"Length", TType::kUint32, {}}});
+    device->AddPropertyDecl(Decl({"Length", TType::kUint64, {}}));
+    EXPECT_EQ(13, StatusOf([&] { tape->Validate(none); }));
+    EXPECT_EQ(13, StatusOf([&] { tape->AddToNamespace(none); }));
+    EXPECT_EQ("Disk Fan", SubClassesOf(*device, false));
+}
+
 TEST_F(InMemClassTest, ADeclarationBelongsToOneClassAndStandsThereOnce)
 {
     const auto decl = Decl({"Serial", TType::kString, {}});

@@ -128,6 +128,16 @@ TEST_F(InMemInstanceTest, AChangedKeyDoesNotChangeWhichInstanceItIs)
     EXPECT_EQ(12, StatusOf([&] { Add(disk, {{"Id", "sda"}}); }));
 }
 
+TEST_F(InMemInstanceTest, DeletedAndAddedAgainItIsFoundByItsChangedKey)
+{
+    const auto instance = Add(disk, {{"Id", "sda"}});
+    Property(instance, "Id").SetValue(TCIMValue("sdb"), none);
+    ns->DeleteInstance(Path("Disk.Id=\"sda\""), none);
+    instance->AddToNamespace(none);
+    EXPECT_EQ("Disk.Id=\"sdb\"\n", InstancesOf(*disk));
+    EXPECT_EQ(instance, ns->FindInstance(Path("Disk.Id=\"sdb\"")));
+}
+
 TEST_F(InMemInstanceTest, ReferencesNameNamespaceClassAndKeys)
 {
     const auto instance = Allocate(disk, {{"Id", "a\"b"}});
@@ -186,13 +196,14 @@ TEST_F(InMemInstanceTest, InstancesThatAreThereGetALaterPropertyAsNull)
     const auto instance = Add(disk, {{"Id", "sda"}});
     disk->AddPropertyDecl(Decl({"Serial", TType::kString, {}}));
     const auto serial = instance->GetProperty("Serial", none);
+    disk->AddPropertyDecl(Decl({"Heat", TType::kUint8, {}}));
     disk->AddPropertyDecl(Decl({"Wear", TType::kUint8, {}}));
     serial->SetValue(TCIMValue("S1"), none);
     instance->FindProperty("Wear")->MarkChanged(TCIMValue(static_cast<unsigned char>(3)));
-    EXPECT_EQ("Id=sda Size=NULL Label=NULL Tags=NULL Serial=S1 Wear=3", ValuesOf(*instance));
+    EXPECT_EQ("Id=sda Size=NULL Label=NULL Tags=NULL Serial=S1 Heat=NULL Wear=3", ValuesOf(*instance));
     EXPECT_EQ("Serial", serial->GetPropertyDecl(none)->GetName(none));
     EXPECT_TRUE(instance->FindProperty("Wear")->GetEarlierValue()->IsNull());
-    EXPECT_EQ("Id=NULL Size=NULL Label=NULL Tags=NULL Serial=NULL Wear=NULL", ValuesOf(*disk->AllocateInstance(none)));
+    EXPECT_EQ("Id=NULL Size=NULL Label=NULL Tags=NULL Serial=NULL Heat=NULL Wear=NULL", ValuesOf(*disk->AllocateInstance(none)));
 }
 
 TEST_F(InMemInstanceTest, HandlesKeepTheInstanceAliveAndOutliveTheNamespace)
@@ -212,18 +223,23 @@ TEST_F(InMemInstanceTest, HandlesKeepTheInstanceAliveAndOutliveTheNamespace)
 
 TEST_F(InMemInstanceTest, ANamespaceWithReferencesIntoItselfIsDestroyed)
 {
-    const auto part = Allocate("Part", nullptr, {{"Name", TType::kString, {"Key"}}});
+    auto part = Allocate("Part", nullptr, {{"Name", TType::kString, {"Key"}}});
     part->AddPropertyDecl(Reference("Disk", "Disk"));
     part->AddPropertyDecl(Decl({"Default", TType::kReference, {"Static"}}));
     part->AddToNamespace(none);
-    const auto target = Add(disk, {{"Id", "sda"}});
-    const auto instance = Add(part, {{"Name", "p1"}, {"Disk", TCIMValue(target->GetReference())}});
+    auto target = Add(disk, {{"Id", "sda"}});
+    auto instance = Add(part, {{"Name", "p1"}, {"Disk", TCIMValue(target->GetReference())}});
     part->SetPropertyValue("Default", TCIMValue(instance->GetReference()), none);
     EXPECT_EQ("root/cimv2:Part.Disk=\"root/cimv2:Disk.Id=\\\"sda\\\"\",Name=\"p1\"",
               part->GetProperty("Default", none)->GetValue(none).ToText());
     const boost::weak_ptr<TInMemNamespace> watchedNamespace = ns;
-    const boost::weak_ptr<TInMemClass> watchedClass = Declare("Other", part);
+    const boost::weak_ptr<TInMemClass> watchedClass = part;
+    const boost::weak_ptr<TInMemInstance> watchedTarget = target;
+    instance.reset();
+    target.reset();
+    part.reset();
     ns.reset();
+    EXPECT_TRUE(watchedTarget.expired());
     EXPECT_TRUE(watchedNamespace.expired());
     EXPECT_TRUE(watchedClass.expired());
 }

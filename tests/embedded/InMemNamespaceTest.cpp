@@ -62,6 +62,22 @@ TEST_F(InMemNamespaceTest, InstancesMayComeAndGoWhileTheyAreEnumerated)
     EXPECT_EQ(100U, disk->GetInstanceCount());
 }
 
+TEST_F(InMemNamespaceTest, AllInstancesMayBeDeletedWhileTheyAreEnumerated)
+{
+    for (int number = 0; number < 100; ++number) {
+        Add(disk, {{"Id", TCIMValue(std::to_string(number))}});
+    }
+    int seen = 0;
+    disk->EnumerateInstances(
+        [&](boost::shared_ptr<ICIMInstance> instance) {
+            ns->DeleteInstance(instance->GetReference(none), none);
+            return ++seen > 0;
+        },
+        false, none);
+    EXPECT_EQ(100, seen);
+    EXPECT_EQ("", InstancesOf(*disk));
+}
+
 TEST_F(InMemNamespaceTest, PathsFindInstancesWhateverTheirNamespaceAndLetterCase)
 {
     const auto instance = Add(disk, {{"Id", "sda"}});
