@@ -129,5 +129,13 @@ TEST(StoreOutOfMemory, TidyingUpAfterDeletionsCanWait)
     EXPECT_EQ("", DumpInstances(store, "Disk"));
 }
 
+TEST(StoreOutOfMemory, AddingAPropertyToAClassInUseAddsItOrNot)
+{
+    EXPECT_EQ("bad_alloc", FailEach("AddPropertyDecl", [](ICIMNamespace& ns) {
+                  const auto cls = ns.GetClass("Disk", kNone);
+                  cls->AddPropertyDecl(cls->AllocatePropertyDecl("Label", TCIMValue::Null(EType::kString), kNone));
+              }));
+}
+
 }  // namespace
 }  // namespace NORVZEL20
