@@ -117,9 +117,7 @@ void TRuleTrace::Inherit(const std::string& className, const TClass& parent, con
 {
     const auto known = fClasses.find(className);
     if (known == fClasses.end()) {
-        TClass copy = parent;
-        copy.isFinal = false;
-        fClasses.insert({className, copy});
+        fClasses.insert({className, parent});
         return;
     }
     if (known->second.isFinal) {

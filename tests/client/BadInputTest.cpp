@@ -96,6 +96,38 @@ TEST_F(BadInputTest, CompressedFilesThatEndEarlyAreTold)
     }
 }
 
+TEST_F(BadInputTest, ALargeCompressedFileThatEndsEarlyIsTold)
+{
+    const std::string whole = ReadFile(CIMDELTA_PAIR_DATA "/a.xml.xz");
+    const std::string half = Scratch("half.xz", whole.substr(0, whole.size() / 2));
+    EXPECT_EQ("cimdelta: H: cannot be read: truncated",
+              Shorten(Complaint({"compare", "web01.xml", half}), half, "H").substr(0, 38));
+}
+
+TEST_F(BadInputTest, InventoriesThatAreNoInventoriesAreToldWithTheirPlace)
+{
+    const struct {
+        const char* inventory;
+        const char* begins;
+    } rows[] = {
+        {"", "cimdelta: I:1:1: "},
+        {"no XML", "cimdelta: I:1:1: "},
+        {"<CIM>\n<DECLARATION>", "cimdelta: I:2:"},
+        {"<CIM>\n<SURPRISE/></CIM>", "cimdelta: I:2:1: "},
+        {"<?xml version='1.0' encoding='EBCDIC-X'?><CIM/>", "cimdelta: I:1:"},
+        {"<CIM><DECLARATION><DECLGROUP>\n<VALUE.OBJECT><INSTANCE CLASSNAME='Nix'/></VALUE.OBJECT></DECLGROUP></DECLARATION></CIM>",
+         "cimdelta: I:2:"},
+    };
+    int number = 0;
+    for (const auto& row : rows) {
+        SCOPED_TRACE(row.inventory);
+        const std::string inventory = Scratch(std::to_string(number++), row.inventory);
+        const std::string message = Shorten(Complaint({"compare", "web01.xml", inventory}), inventory, "I");
+        EXPECT_EQ(row.begins, message.substr(0, std::string(row.begins).size())) << message;
+        EXPECT_EQ(message.size() - 1, message.find('\n')) << message;
+    }
+}
+
 TEST_F(BadInputTest, WrongUsageIsToldInOneLine)
 {
     EXPECT_EQ("cimdelta: name a command: compare, check, explain, query or show; see cimdelta --help\n", Complaint({}));

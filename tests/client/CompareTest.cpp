@@ -3,7 +3,16 @@
 namespace NORVZEL20 {
 namespace {
 
-class CompareTest : public ClientTest {};
+class CompareTest : public ClientTest {
+  protected:
+    /// The inventory without its last instance.
+    static std::string WithoutLast(std::string inventory)
+    {
+        const std::string end = "</INSTANCE></VALUE.OBJECT>\n";
+        const std::size_t begin = inventory.rfind("<VALUE.OBJECT><INSTANCE");
+        return inventory.erase(begin, inventory.find(end, begin) + end.size() - begin);
+    }
+};
 
 const char kMadeForOther[] =
     "cimdelta: other-schema.xml: has no instance of KALMO_OperatingSystem, which a comparison needs; one was made\n";
@@ -173,6 +182,45 @@ TEST_F(CompareTest, InstancesThatShareAKeyAreTold)
         Result({"compare", "--spec", "rules.xml", "web02.xml", "two-boots.xml"}));
     EXPECT_NE(std::string::npos, Result({"compare", "--spec", "rules.xml", "two-boots.xml", "web02.xml"})
                                      .find("leave out BootId: 1 of two-boots; those of two-boots were not compared.\n"));
+}
+
+TEST_F(CompareTest, NoDifferencesIsNotSaidOverInstancesThatShareAKey)
+{
+    const std::string rules = Scratch("share", "<DifftoolSpec><class name='INV_Disk' default='include' excludekeys='BootId'/>"
+                                               "<class name='KALMO_OperatingSystem' default='include'/></DifftoolSpec>");
+    const std::string both = WithoutLast(ReadFile("two-boots.xml"));
+    const std::string two = Scratch("two.xml", both);
+    const std::string one = Scratch("one.xml", WithoutLast(both));
+    Run({"compare", "--spec", rules, two, one});
+    EXPECT_EQ("No differences in what was compared", fOut.substr(0, 35));
+    EXPECT_EQ(0, fStatus);
+}
+
+TEST_F(CompareTest, AnOperatingSystemIsMadeAfterTheStandardOne)
+{
+    const std::string rules = Scratch("os", "<DifftoolSpec><class name='KALMO_OperatingSystem' default='include'/></DifftoolSpec>");
+    std::string text = ReadFile("other-schema.xml");
+    const std::string first = "<VALUE.OBJECT><INSTANCE CLASSNAME=\"ACME_OperatingSystem\">";
+    text.insert(text.find(first),
+                first + "<PROPERTY NAME=\"CreationClassName\" TYPE=\"string\"><VALUE>Z</VALUE></PROPERTY>"
+                        "<PROPERTY NAME=\"Name\" TYPE=\"string\"><VALUE>last</VALUE></PROPERTY></INSTANCE></VALUE.OBJECT>");
+    const std::string two = Scratch("two.xml", text);
+    for (const std::string& inventory : {std::string("other-schema.xml"), two}) {
+        Run({"compare", "-o", "ndjson", "--spec", rules, "web01.xml", inventory});
+        EXPECT_NE(std::string::npos, fOut.find("{\"kind\":\"onlyInOthers\",\"class\":\"KALMO_OperatingSystem\","
+                                               "\"instance\":\"KALMO_OperatingSystem.Name=\\\"acme\\\"\""))
+            << fOut;
+    }
+}
+
+TEST_F(CompareTest, AnOperatingSystemIsMadeWhereTheClassHasNoInstance)
+{
+    const std::string none = Scratch("none.xml", WithoutLast(ReadFile("empty-classes.xml")));
+    Run({"compare", none, "empty-classes.xml"});
+    EXPECT_EQ("cimdelta: N: has no instance of KALMO_OperatingSystem, which a comparison needs; one was made\n",
+              Shorten(fErr, none, "N"));
+    EXPECT_EQ("Nothing was compared between ", fOut.substr(0, 29));
+    EXPECT_EQ(0, fStatus);
 }
 
 TEST_F(CompareTest, AnInstanceGoneUnderExcludedKeysIsFoundByItsPath)

@@ -109,6 +109,16 @@ TEST_F(RulesCommandsTest, ExplainFollowsInheritanceAndOrder)
               Result({"explain", "INV_Package.Version", "--spec", "odd-rules.xml", "--schema", "web01.xml"}));
 }
 
+TEST_F(RulesCommandsTest, ExplainFollowsAnIncludedNameInAnotherLetterCase)
+{
+    const std::string rules =
+        Scratch("case", "<DifftoolSpec>\n<class name='INV_Package'>\n<includelist><value>version</value></includelist>\n"
+                        "</class></DifftoolSpec>");
+    EXPECT_EQ("INV_Package.Version: compared, included by the list at R:3 (element for class INV_Package)\n",
+              Shorten(Result({"explain", "INV_Package.Version", "--spec", rules, "--schema", "web01.xml"}), rules, "R"));
+    EXPECT_NE(std::string::npos, Result({"compare", "--spec", rules, "web01.xml", "web02.xml"}).find("    version: 5.1 -> 5.2\n"));
+}
+
 TEST_F(RulesCommandsTest, ExplainKnowsWhatIsNeverCompared)
 {
     const std::string rules = Scratch("os", "<DifftoolSpec><class name='KALMO_OperatingSystem' default='include'/></DifftoolSpec>");
