@@ -133,11 +133,22 @@ std::size_t CompareWithList(const TLoading& loading)
     return count;
 }
 
+std::size_t CountInstances(const TLoading& loading)
+{
+    std::size_t count = 0;
+    for (const boost::shared_ptr<TInMemClass>& cls : loading.GetNamespace()->GetClasses())
+        count += cls->GetInstanceCount();
+    return count;
+}
+
 void ExpectSameAfterWriting(const TLoading& loading)
 {
     const std::string written = loading.Write();
     TLoading again;
-    ASSERT_EQ("", again.ErrorOf(written));
+    const TLoadReport report = again.Load(written);
+    EXPECT_EQ(loading.GetNamespace()->GetQualifierDecls().size(), report.qualifierDecls);
+    EXPECT_EQ(loading.GetNamespace()->GetClasses().size(), report.classes);
+    EXPECT_EQ(CountInstances(loading), report.instances);
     EXPECT_EQ(written, again.Write());
 }
 

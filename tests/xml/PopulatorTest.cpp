@@ -80,6 +80,9 @@ TEST_F(PopulatorTest, ReferencesIntoTheOwnNamespaceAreStoredWithoutIt)
              InstanceName("A", "x") + "</INSTANCEPATH>",
          "//g/root/here:A.Id=\"x\""},
         {"class", "<CLASSNAME NAME=\"Unknown\"/>", "Unknown"},
+        {"spelling", "<INSTANCENAME CLASSNAME=\"a\"><KEYBINDING NAME=\"ID\"><KEYVALUE>x</KEYVALUE></KEYBINDING></INSTANCENAME>",
+         "A.Id=\"x\""},
+        {"only key", "<INSTANCENAME CLASSNAME=\"A\"><KEYVALUE>x</KEYVALUE></INSTANCENAME>", "A.Id=\"x\""},
     };
     std::string contents =
         "<NAMESPACEPATH><HOST>h</HOST>" + LocalNamespace("root", "here") + "</NAMESPACEPATH>" + L::Class("A", kReferenceR);
@@ -166,6 +169,16 @@ TEST_F(PopulatorTest, AClassThatIsThereAlreadyIsToleratedWhereItIsTheSame)
               fLoading.ErrorOf(L::Group(L::Class("A"))));
 }
 
+TEST_F(PopulatorTest, WhatASuperclassHasIsInheritedWhereADocumentRepeatsIt)
+{
+    const std::string repeating =
+        "<VALUE.OBJECT><CLASS NAME=\"B\" SUPERCLASS=\"A\"><PROPERTY NAME=\"S\" TYPE=\"string\" PROPAGATED=\"true\"/>"
+        "</CLASS></VALUE.OBJECT>\n";
+    fLoading.Load(L::Group(L::Class("A", kPropertyS) + repeating));
+    EXPECT_TRUE(fLoading.GetNamespace()->FindClass("B")->GetOwnPropertyDecls().empty());
+    EXPECT_EQ("", fLoading.ErrorOf(L::Group(repeating)));
+}
+
 TEST_F(PopulatorTest, EmbeddedObjectsAreReadByTheirMarkOrTheirDeclaration)
 {
     const std::string declared = "<PROPERTY NAME=\"E\" TYPE=\"string\"><QUALIFIER NAME=\"EmbeddedInstance\" TYPE=\"string\">"
@@ -185,13 +198,26 @@ TEST_F(PopulatorTest, EmbeddedObjectsAreReadByTheirMarkOrTheirDeclaration)
     EXPECT_EQ("words", valueOf("A.Id=\"plain\"", "E").GetString());
 }
 
-TEST_F(PopulatorTest, EmbeddedObjectsDoNotNestForEver)
+/// The text of embedded objects, one within the other.
+std::string Nested(int levels)
 {
     std::string text = "<INSTANCE CLASSNAME=\"X\"></INSTANCE>";
-    for (int level = 0; level < 33; ++level)
-        text = "<INSTANCE CLASSNAME=\"X\"><PROPERTY NAME=\"P\" TYPE=\"string\" EmbeddedObject=\"instance\"><VALUE><![CDATA[" +
-               text.substr(0, text.find("]]>")) + "]]></VALUE></PROPERTY></INSTANCE>";
-    EXPECT_NE(0, fLoading.StatusOf(L::Group(L::Class("A", kPropertyS) + "<VALUE.OBJECT>" + text + "</VALUE.OBJECT>")));
+    for (int level = 0; level < levels; ++level) {
+        std::string escaped;
+        for (const char c : text)
+            escaped += c == '<' ? "&lt;" : c == '&' ? "&amp;" : std::string(1, c);
+        text = "<INSTANCE CLASSNAME=\"A\">" + (level + 1 == levels ? L::Property("Id", "string", "1") : std::string()) +
+               "<PROPERTY NAME=\"S\" TYPE=\"string\" EmbeddedObject=\"object\"><VALUE>" + escaped +
+               "</VALUE></PROPERTY></INSTANCE>";
+    }
+    return text;
+}
+
+TEST_F(PopulatorTest, EmbeddedObjectsDoNotNestForEver)
+{
+    EXPECT_EQ("", fLoading.ErrorOf(L::Group(L::Class("A", kPropertyS) + Nested(32))));
+    EXPECT_THAT(TLoading().ErrorOf(L::Group(L::Class("A", kPropertyS) + Nested(33))),
+                testing::EndsWith(": in an embedded object: embedded objects are nested too deeply"));
 }
 
 TEST_F(PopulatorTest, WhatHoldsNoObjectsIsToldOnce)

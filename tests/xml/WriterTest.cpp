@@ -32,6 +32,33 @@ TEST(CimXmlWriterTest, TheNamespaceIsNamedWhereTheCallerSaysSo)
     EXPECT_EQ("root/there", loading.Load(text).namespaceName);
 }
 
+/// One of everything that a class can hold, in the form that the writer gives it.
+TEST(CimXmlWriterTest, DeclarationsComeBackAsTheyWereWritten)
+{
+    const std::string declarations =
+        "<QUALIFIER.DECLARATION NAME=\"Q\" TYPE=\"sint32\" ISARRAY=\"true\" OVERRIDABLE=\"false\" TOSUBCLASS=\"false\" "
+        "TOINSTANCE=\"true\" TRANSLATABLE=\"true\"><SCOPE CLASS=\"true\" METHOD=\"true\" INDICATION=\"true\"/>"
+        "<VALUE.ARRAY><VALUE>-1</VALUE><VALUE>2</VALUE></VALUE.ARRAY></QUALIFIER.DECLARATION>\n"
+        "<VALUE.OBJECT><CLASS NAME=\"A\">"
+        "<QUALIFIER NAME=\"Q\" TYPE=\"sint32\" OVERRIDABLE=\"false\" TOSUBCLASS=\"false\" TOINSTANCE=\"true\" "
+        "TRANSLATABLE=\"true\"><VALUE.ARRAY><VALUE>5</VALUE></VALUE.ARRAY></QUALIFIER>"
+        "<PROPERTY NAME=\"P\" TYPE=\"real64\"><VALUE>0.5</VALUE></PROPERTY>"
+        "<PROPERTY.ARRAY NAME=\"F\" TYPE=\"uint8\" ARRAYSIZE=\"4\"></PROPERTY.ARRAY>"
+        "<PROPERTY.REFERENCE NAME=\"R\" REFERENCECLASS=\"A\"></PROPERTY.REFERENCE>"
+        "<METHOD NAME=\"M\" TYPE=\"uint32\"><QUALIFIER NAME=\"Q\" TYPE=\"sint32\"></QUALIFIER>"
+        "<PARAMETER NAME=\"a\" TYPE=\"string\"></PARAMETER>"
+        "<PARAMETER.ARRAY NAME=\"b\" TYPE=\"string\" ARRAYSIZE=\"2\"></PARAMETER.ARRAY>"
+        "<PARAMETER.REFERENCE NAME=\"c\" REFERENCECLASS=\"A\"></PARAMETER.REFERENCE>"
+        "<PARAMETER.REFARRAY NAME=\"d\" REFERENCECLASS=\"A\"></PARAMETER.REFARRAY></METHOD>"
+        "</CLASS></VALUE.OBJECT>\n"
+        "<VALUE.OBJECT><CLASS NAME=\"B\" SUPERCLASS=\"A\"></CLASS></VALUE.OBJECT>\n";
+    TLoading loading;
+    loading.Load(L::Group(declarations));
+    const std::string written = loading.Write();
+    const std::size_t start = written.find("<QUALIFIER.DECL");
+    EXPECT_EQ(declarations, written.substr(start, written.find("</DECLGROUP>") - start));
+}
+
 TEST(CimXmlWriterTest, AnInstanceIsOneElement)
 {
     TLoading loading;
