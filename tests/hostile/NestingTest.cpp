@@ -1,4 +1,6 @@
 // Elements, attributes and names beyond any measure.
+#include "embedded/TCimXmlPopulator.h"
+#include "embedded/TInMemNamespace.h"
 #include "tests/hostile/HostileRow.h"
 #include "tests/hostile/TMemoryMeter.h"
 
@@ -47,7 +49,7 @@ TEST(NestingTest, AMillionNestedElementsAreRefused)
 TEST(NestingTest, TenThousandAttributesAreRefused)
 {
     const std::string many = "<a" + Attributes(10000) + "/>";
-    ExpectOutcomes({Refused("different ones", {"", many}, many.size(), "too many attributes"),
+    ExpectOutcomes({Refused("different ones", {"", many}, 0, "too many attributes"),
                     Refused("one twice", {"", "<a b='' c='' b=''/>"}, 13, "duplicate attribute")});
 }
 
@@ -64,14 +66,35 @@ TEST(NestingTest, TagsBeyondTheLimitAreRefused)
 {
     const std::string name = "<" + std::string(20 * kMegabyte, 'n') + "/>";
     const std::string value = "<a b='" + std::string(20 * kMegabyte, 'v') + "'/>";
-    ExpectOutcomes({Refused("a name", {"", name}, name.size(), "a tag is too long"),
-                    Refused("a value", {"", value}, value.size(), "a tag is too long")});
+    ExpectOutcomes(
+        {Refused("a name", {"", name}, 0, "a tag is too long"), Refused("a value", {"", value}, 0, "a tag is too long")});
 }
 
 /// What need not be kept may be as long as it likes.
 TEST(NestingTest, LongCommentsAreReadOver)
 {
     ExpectOutcomes({Handled("a comment", {"", "I<!--" + std::string(20 * kMegabyte, '.') + "-->d"})});
+}
+
+/// Whoever walks a class tree does so recursively, so its height is bounded.
+TEST(NestingTest, ATreeOfTooManyLevelsIsRefused)
+{
+    std::string text =
+        "<CIM CIMVERSION=\"2.0\" DTDVERSION=\"2.0\"><DECLARATION><DECLGROUP>\n<VALUE.OBJECT><CLASS NAME=\"C0\"/></VALUE.OBJECT>";
+    for (int level = 1; level < 100000; ++level) {
+        const std::string super = std::to_string(level - 1);
+        text += "\n<VALUE.OBJECT><CLASS NAME=\"C" + std::to_string(level) + "\" SUPERCLASS=\"C" + super + "\"/></VALUE.OBJECT>";
+    }
+    text += "</DECLGROUP></DECLARATION></CIM>";
+    const boost::shared_ptr<TInMemNamespace> ns = TInMemNamespace::Create("root/cimv2");
+    try {
+        TCimXmlPopulator(ns).LoadFromMemory(text.data(), text.size(), "tall.xml");
+        FAIL() << "loaded";
+    } catch (const TPopulateError& error) {
+        EXPECT_STREQ("tall.xml:1003:15: found class \"C1001\" below more than 1000 superclasses; flatten the class tree",
+                     error.what());
+    }
+    EXPECT_TRUE(ns->GetClasses().empty());
 }
 
 /// A default declared once is handed out for every element.
