@@ -409,11 +409,11 @@ TEST_F(InMemClassTest, AssignmentTakesNothingOver)
 TEST_F(InMemClassTest, ALongLineOfSubclassesIsWalkedAndDestroyedWithoutRecursion)
 {
     TClassPointer last = room;
-    for (int depth = 0; depth < 20000; ++depth) {
+    for (int depth = 0; depth < 60000; ++depth) {
         last = Declare("C" + std::to_string(depth), last);
     }
     EXPECT_TRUE(last->IsSubclassOf(room, none));
-    EXPECT_EQ(20000U, room->GetClassesBelow().size());
+    EXPECT_EQ(60000U, room->GetClassesBelow().size());
     last.reset();
     ns.reset();
 }

@@ -1,8 +1,36 @@
 #include <malloc.h>
 
-#include <algorithm>
+#include <atomic>
+#include <cstdio>
+#include <cstdlib>
+#include <new>
 
 #include "tests/embedded/InMemFixture.h"
+
+namespace {
+
+std::atomic<std::size_t> gAllocations{0};
+
+}  // namespace
+
+void* operator new(std::size_t size)
+{
+    ++gAllocations;
+    if (void* const block = std::malloc(size ? size : 1)) {
+        return block;
+    }
+    throw std::bad_alloc();
+}
+
+void operator delete(void* block) noexcept
+{
+    std::free(block);
+}
+
+void operator delete(void* block, std::size_t) noexcept
+{
+    std::free(block);
+}
 
 namespace NORVZEL20 {
 namespace {
@@ -74,22 +102,27 @@ TEST_F(InMemMemoryTest, AnInstanceOfThirteenPropertiesTakesAtMostAThousandBytes)
 
 TEST_F(InMemMemoryTest, ReadingAPropertyAllocatesNothing)
 {
-    if (!kOwnHeap) {
-        GTEST_SKIP() << "the heap cannot be measured under a sanitizer";
-    }
     const auto cls = DeclarePackage();
     AddPackage(cls, 1);
     const std::string name = "architecture";
     cls->EnumerateInstances(
         [&](boost::shared_ptr<ICIMInstance> instance) {
-            const std::size_t before = HeapInUse();
+            const std::size_t before = gAllocations;
             const auto property = instance->GetProperty(name, none);
             const TCIMValue value = property->GetValue(none);
-            EXPECT_EQ(before, HeapInUse());
+            EXPECT_EQ(before, gAllocations);
             EXPECT_EQ("amd64", value.GetString());
             return true;
         },
         false, none);
+}
+
+TEST_F(InMemMemoryTest, AnInstanceIsOneAllocation)
+{
+    const auto cls = DeclarePackage();
+    const std::size_t before = gAllocations;
+    const auto instance = cls->AllocateInMemInstance();
+    EXPECT_EQ(before + 1, gAllocations);
 }
 
 }  // namespace
