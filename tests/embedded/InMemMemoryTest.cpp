@@ -1,36 +1,9 @@
 #include <malloc.h>
 
-#include <atomic>
 #include <cstdio>
-#include <cstdlib>
-#include <new>
 
+#include "tests/embedded/CountedAllocations.h"
 #include "tests/embedded/InMemFixture.h"
-
-namespace {
-
-std::atomic<std::size_t> gAllocations{0};
-
-}  // namespace
-
-void* operator new(std::size_t size)
-{
-    ++gAllocations;
-    if (void* const block = std::malloc(size ? size : 1)) {
-        return block;
-    }
-    throw std::bad_alloc();
-}
-
-void operator delete(void* block) noexcept
-{
-    std::free(block);
-}
-
-void operator delete(void* block, std::size_t) noexcept
-{
-    std::free(block);
-}
 
 namespace NORVZEL20 {
 namespace {
@@ -107,10 +80,10 @@ TEST_F(InMemMemoryTest, ReadingAPropertyAllocatesNothing)
     const std::string name = "architecture";
     cls->EnumerateInstances(
         [&](boost::shared_ptr<ICIMInstance> instance) {
-            const std::size_t before = gAllocations;
+            const std::size_t before = CountedAllocations();
             const auto property = instance->GetProperty(name, none);
             const TCIMValue value = property->GetValue(none);
-            EXPECT_EQ(before, gAllocations);
+            EXPECT_EQ(before, CountedAllocations());
             EXPECT_EQ("amd64", value.GetString());
             return true;
         },
@@ -120,9 +93,9 @@ TEST_F(InMemMemoryTest, ReadingAPropertyAllocatesNothing)
 TEST_F(InMemMemoryTest, AnInstanceIsOneAllocation)
 {
     const auto cls = DeclarePackage();
-    const std::size_t before = gAllocations;
+    const std::size_t before = CountedAllocations();
     const auto instance = cls->AllocateInMemInstance();
-    EXPECT_EQ(before + 1, gAllocations);
+    EXPECT_EQ(before + 1, CountedAllocations());
 }
 
 }  // namespace

@@ -29,7 +29,7 @@ class ConstructionTest : public testing::TestWithParam<EHost> {
     }
 
     TCapturingLogger fLog;
-    TComparison fComparison;
+    TComparisonRun fComparison;
     std::vector<boost::shared_ptr<ICIMNamespace>> fNamespaces;
 };
 
@@ -112,7 +112,7 @@ TEST_P(ConstructionTest, TheRulesAreThoseOfTheFile)
 TEST_P(ConstructionTest, AMissingClassFailsTheCheck)
 {
     for (const std::size_t missing : {0u, 1u, 2u}) {
-        TComparison comparison(GetParam());
+        TComparisonRun comparison(GetParam());
         for (std::size_t index = 0; index < 3; ++index) {
             comparison.SetWithOperatingSystem(index != missing);
             comparison.SetNamespaceCount(index + 1);

@@ -22,7 +22,7 @@ class TFaultyRun : public TPerClassFixture {
         fComparison.Prepare();
     }
 
-    TComparison& Get() { return fComparison; }
+    TComparisonRun& Get() { return fComparison; }
     void TestBody() override {}
 };
 

@@ -37,7 +37,7 @@ class RunCallsTest : public testing::TestWithParam<EHost> {
     }
 
     TCapturingLogger fLog;
-    TComparison fComparison;
+    TComparisonRun fComparison;
 
   private:
     std::size_t fDeclared = 0;

@@ -101,7 +101,7 @@ std::string RulesOf(const TNaiveSet& set)
 std::string CompareByPlugIn(const TNaiveSet& set, EHost host)
 {
     TCapturingLogger log;
-    TComparison comparison(host);
+    TComparisonRun comparison(host);
     comparison.SetWithOperatingSystem(false);
     for (std::size_t index = 0; index < set.namespaces.size(); ++index) {
         Build(set.namespaces[index], comparison.Namespace(index));

@@ -3,7 +3,7 @@
 #include <string>
 
 #include "tests/engine/NaiveSet.h"
-#include "tests/support/TComparison.h"
+#include "tests/support/TComparisonRun.h"
 
 namespace NORVZEL20 {
 

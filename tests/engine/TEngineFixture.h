@@ -10,7 +10,7 @@
 #include "engine/TCIMDiffEngine.h"
 #include "spec/TDiffClassRules.h"
 #include "tests/support/TCapturingLogger.h"
-#include "tests/support/TComparison.h"
+#include "tests/support/TComparisonRun.h"
 
 namespace NORVZEL20 {
 
@@ -36,7 +36,7 @@ class TEngineFixture : public testing::Test {
 
     const TCallContext fNone;
     TCapturingLogger fLog;
-    TComparison fComparison;
+    TComparisonRun fComparison;
     std::vector<boost::shared_ptr<ICIMNamespace>> fNamespaces;
     std::unique_ptr<TEngine> fEngine;
 };

@@ -5,7 +5,7 @@
 #include <string>
 
 #include "tests/support/TCapturingLogger.h"
-#include "tests/support/TComparison.h"
+#include "tests/support/TComparisonRun.h"
 
 namespace NORVZEL20 {
 
@@ -26,7 +26,7 @@ class TPerClassFixture : public testing::Test {
     std::string Disks(std::size_t index);
 
     TCapturingLogger fLog;
-    TComparison fComparison;
+    TComparisonRun fComparison;
 
   private:
     std::size_t fDeclared = 0;

@@ -7,7 +7,7 @@
 #include "tests/faults/FailEachAllocation.h"
 #include "tests/support/Dump.h"
 #include "tests/support/TCapturingLogger.h"
-#include "tests/support/TComparison.h"
+#include "tests/support/TComparisonRun.h"
 #include "tests/support/TTestAccess.h"
 
 namespace NORVZEL20 {
@@ -145,7 +145,7 @@ TEST_P(OutOfMemory, AddingANamespaceAddsItOrNot)
 
 TEST_P(OutOfMemory, ReadingASpecificationHasAStatusForItsBufferAlone)
 {
-    const TTemporaryFile rules(RulesForDiffering(true));
+    const TScratchFile rules(RulesForDiffering(true));
     const auto make = [&] { return std::make_unique<TReadSpecification>(rules.GetPath()); };
     EXPECT_EQ("bad_alloc, status 4, bad_alloc", FailEachAllocation(NameOf("ReadSpecFile"), make, GetParam()));
 }

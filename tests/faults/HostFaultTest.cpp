@@ -6,7 +6,7 @@
 #include "tests/faults/DifferingNamespaces.h"
 #include "tests/faults/TFaultyRun.h"
 #include "tests/support/TCapturingLogger.h"
-#include "tests/support/TComparison.h"
+#include "tests/support/TComparisonRun.h"
 #include "tests/support/TTestAccess.h"
 #include "tests/support/TWatchedNamespace.h"
 
@@ -61,7 +61,7 @@ struct TPrepared {
         return TraceRecords(watched->GetWatched());
     }
 
-    TComparison comparison;
+    TComparisonRun comparison;
 };
 
 /// A host that fails one call of a run.

@@ -6,7 +6,7 @@
 #include "host/TAddToVectorCallback.h"
 #include "tests/faults/DifferingNamespaces.h"
 #include "tests/faults/FailEachAllocation.h"
-#include "tests/support/TComparison.h"
+#include "tests/support/TComparisonRun.h"
 #include "tests/support/TTestAccess.h"
 
 namespace NORVZEL20 {
@@ -38,7 +38,7 @@ class FailingHostOfWrappers : public testing::TestWithParam<EHost> {
     /// Whether there was such a call.
     bool FailCall(std::size_t call, EStatus status)
     {
-        TComparison comparison(GetParam());
+        TComparisonRun comparison(GetParam());
         for (std::size_t index = 0; index < 2; ++index) {
             FillDiffering(comparison.Namespace(index), index);
         }

@@ -13,7 +13,7 @@
 #include "tests/faults/TOpenHook.h"
 #include "tests/support/Dump.h"
 #include "tests/support/TCapturingLogger.h"
-#include "tests/support/TComparison.h"
+#include "tests/support/TComparisonRun.h"
 
 namespace NORVZEL20 {
 namespace {
@@ -168,7 +168,7 @@ TEST_P(InventoryOutOfMemory, LoadingInPiecesLeavesTheNamespaceAsItWas)
 
 TEST_P(InventoryOutOfMemory, PopulatingFromAFileLeavesTheNamespaceAsItWas)
 {
-    const TTemporaryFile file(kMore);
+    const TScratchFile file(kMore);
     EXPECT_EQ("bad_alloc", FailEach("PopulateFromXMLFile", [&](boost::shared_ptr<ICIMNamespace> ns) {
                   TNamespacePopulator::PopulateFromXMLFile(ns, file.GetPath());
               }));
@@ -209,7 +209,7 @@ class InventorySource : public testing::Test {
 
     const std::string kBefore = DumpNamespace(MakeBase());
     const std::string kAfter = DumpWithMore();
-    TTemporaryFile fFile{kMore};
+    TScratchFile fFile{kMore};
     boost::shared_ptr<ICIMNamespace> fNamespace = MakeBase();
     std::string fMessage;
 };

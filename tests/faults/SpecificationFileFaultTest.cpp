@@ -12,7 +12,7 @@
 #include "tests/faults/TOpenHook.h"
 #include "tests/support/Dump.h"
 #include "tests/support/TCapturingLogger.h"
-#include "tests/support/TComparison.h"
+#include "tests/support/TComparisonRun.h"
 
 namespace NORVZEL20 {
 namespace {
@@ -62,7 +62,7 @@ class SpecificationFile : public testing::Test {
     const std::string kContents = RulesForDiffering(true);
     const std::string kRules = "Disk include\nGhost include\nSlot exclude State:INCLUDE -Bus\nSsd include\n";
     TCapturingLogger fLog;
-    TTemporaryFile fFile{kContents};
+    TScratchFile fFile{kContents};
     std::string fRules;
 
   private:

@@ -3,7 +3,7 @@
 #include "embedded/TInMemProperty.h"
 #include "tests/faults/FailEachAllocation.h"
 #include "tests/support/Dump.h"
-#include "tests/support/TComparison.h"
+#include "tests/support/TComparisonRun.h"
 
 namespace NORVZEL20 {
 namespace {

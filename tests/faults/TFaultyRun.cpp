@@ -7,7 +7,7 @@
 #include "host/TAddToVectorCallback.h"
 #include "tests/faults/DifferingNamespaces.h"
 #include "tests/support/Dump.h"
-#include "tests/support/TComparison.h"
+#include "tests/support/TComparisonRun.h"
 #include "tests/support/TTestAccess.h"
 
 namespace NORVZEL20 {

@@ -7,7 +7,7 @@
 #include "provider/TDeltaNamespace.h"
 #include "tests/faults/FailEachAllocation.h"
 #include "tests/support/TCapturingLogger.h"
-#include "tests/support/TTemporaryFile.h"
+#include "tests/support/TScratchFile.h"
 
 namespace NORVZEL20 {
 
@@ -39,7 +39,7 @@ class TFaultyRun : public IFaultyAction {
     void VerifyAnotherRun(const std::vector<std::string>& before);
 
     TCapturingLogger fLog;
-    TTemporaryFile fRules;
+    TScratchFile fRules;
     boost::shared_ptr<TDeltaNamespace> fDelta;
     std::vector<boost::shared_ptr<ICIMNamespace>> fNamespaces;
     const TUntouchedRun* fExpected = nullptr;

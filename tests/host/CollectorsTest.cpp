@@ -5,7 +5,7 @@
 #include "host/TAddKeyBindingsToMapCallback.h"
 #include "host/TAddKeyNamesToVectorCallback.h"
 #include "host/TAddToVectorCallback.h"
-#include "tests/support/TComparison.h"
+#include "tests/support/TComparisonRun.h"
 
 namespace NORVZEL20 {
 namespace {

@@ -1,6 +1,6 @@
 #include <gtest/gtest.h>
 
-#include "tests/support/TComparison.h"
+#include "tests/support/TComparisonRun.h"
 #include "tests/support/TPlainQualifier.h"
 
 namespace NORVZEL20 {

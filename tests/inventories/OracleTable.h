@@ -10,6 +10,6 @@ namespace NORVZEL20 {
 ///
 /// Reads a tab-separated file, compressed or not. Rows whose note says that the values are equal as we understand it (the same bag
 /// in another order, the same object named with its namespace) are left out. `withValues` off leaves out ": old -> new".
-std::set<std::string> ReadOracle(const std::string& path, bool withValues);
+std::set<std::string> ReadOracle(const std::string& path, const std::set<std::string>& ordered, bool withValues);
 
 }  // namespace NORVZEL20

@@ -31,7 +31,7 @@ class PackageIndexTest : public testing::Test {
     {
         TInventoryRun run(kData + "/pair/a.xml.xz", kData + "/pair/" + other);
         run.Compare({"DEB_Package", "DEB_PackageDependency"});
-        const std::set<std::string> expected = ReadOracle(kData + "/pair/" + oracle, true);
+        const std::set<std::string> expected = ReadOracle(kData + "/pair/" + oracle, {"Depends", "Constraints"}, true);
         EXPECT_EQ(count, expected.size());
         EXPECT_EQ("", Unmatched(expected, run.Differences(true)));
     }
@@ -47,12 +47,21 @@ TEST_F(PackageIndexTest, SecurityUpdatesDifferAsListed)
     ExpectDifferencesOf("c.xml.xz", "oracle-ac.tsv.xz", 913);
 }
 
+// The list compares texts. Here 0 equals -0, a real32 is what 32 bits hold of it, a datetime is an instant whatever its offset, and
+// the name of an embedded object's class has no letter case.
+const std::set<std::string> kEqualInValue = {
+    "DIFF TST_AllTypes.Id=\"case-198\" p_real64", "DIFF TST_AllTypes.Id=\"case-205\" p_real32",
+    "DIFF TST_AllTypes.Id=\"case-206\" p_datetime", "DIFF TST_AllTypes.Id=\"case-215\" e_inst"};
+
 TEST(EveryTypeTest, ValuesOfAllTypesDifferAsListed)
 {
     TInventoryRun run(kData + "/typepair/A.xml", kData + "/typepair/B.xml");
     run.Compare({"TST_Base", "TST_Part", "TST_Link"});
-    std::set<std::string> expected = ReadOracle(kData + "/typepair/oracle.tsv", false);
-    EXPECT_EQ(151U, expected.size());
+    std::set<std::string> expected = ReadOracle(kData + "/typepair/oracle.tsv", {"a_uint16", "a_uint32"}, false);
+    for (const std::string& difference : kEqualInValue) {
+        EXPECT_EQ(1U, expected.erase(difference)) << difference;
+    }
+    EXPECT_EQ(150U, expected.size());
     EXPECT_EQ("", Unmatched(expected, run.Differences(false)));
 }
 

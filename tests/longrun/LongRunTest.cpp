@@ -91,7 +91,7 @@ TEST(LongRun, FailingRunsLeaveNothing)
 {
     const TQuietLogger quiet;
     const TSmallComparison comparison(3, false);
-    const TTemporaryFile rules("<DifftoolSpec><class name='Disk' default='include'/><class name='Nowhere'/></DifftoolSpec>");
+    const TScratchFile rules("<DifftoolSpec><class name='Disk' default='include'/><class name='Nowhere'/></DifftoolSpec>");
     ExpectFlat("FailingRuns", 1000, [&] {
         const auto delta = comparison.MakeDelta();
         delta->SetSpecFileName(rules.GetPath());

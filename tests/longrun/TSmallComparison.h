@@ -4,8 +4,8 @@
 #include <vector>
 
 #include "tests/faults/DifferingNamespaces.h"
-#include "tests/support/TComparison.h"
-#include "tests/support/TTemporaryFile.h"
+#include "tests/support/TComparisonRun.h"
+#include "tests/support/TScratchFile.h"
 
 namespace NORVZEL20 {
 
@@ -33,7 +33,7 @@ class TSmallComparison {
     }
 
   private:
-    TTemporaryFile fRules;
+    TScratchFile fRules;
     std::vector<boost::shared_ptr<ICIMNamespace>> fNamespaces;
 };
 

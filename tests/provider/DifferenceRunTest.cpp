@@ -27,7 +27,7 @@ class DifferenceRunTest : public testing::TestWithParam<EHost> {
     }
 
     TCapturingLogger fLog;
-    TComparison fComparison;
+    TComparisonRun fComparison;
 };
 
 TEST_P(DifferenceRunTest, RecordsOfARunAreInTheStore)
@@ -79,7 +79,7 @@ TEST(UnownedRunTest, ANamespaceThatNobodyOwnsCannotRun)
 TEST(UnownedRunTest, NobodyIsAskedForAnything)
 {
     TCapturingLogger log;
-    TComparison comparison(EHost::kPlain);
+    TComparisonRun comparison(EHost::kPlain);
     comparison.SetNamespaceCount(2);
     TDeltaNamespace onStack;
     for (const auto& ns : comparison.AllWatched()) {
@@ -93,7 +93,7 @@ TEST(UnownedRunTest, NobodyIsAskedForAnything)
 
 TEST(QueryTest, RecordsOfEveryRunAnswerQueries)
 {
-    TComparison comparison(EHost::kInmem);
+    TComparisonRun comparison(EHost::kInmem);
     for (std::size_t index = 0; index < 3; ++index) {
         comparison.Namespace(index).Class("Disk", "", {TNamespaceBuilder::Key("Id")});
     }
@@ -114,7 +114,7 @@ TEST(RealStoreTest, ARunThroughTheProviderAsAHostMakesIt)
 {
     const auto ns = TDeltaNamespaceProvider::GetInstance()->AllocateNamespace(TCallContext(), false, "root/delta");
     const auto delta = boost::dynamic_pointer_cast<TDeltaNamespace>(ns);
-    const TTemporaryFile rules(kRules);
+    const TScratchFile rules(kRules);
     for (const unsigned int size : {1u, 2u}) {
         TNamespaceBuilder builder(MakeNamespace(EHost::kInmem, "root/cimv2"));
         builder.OperatingSystem().Class("Disk", "", {TNamespaceBuilder::Key("Id"), TNamespaceBuilder::Property("Size", kUint32)});

@@ -191,7 +191,7 @@ TEST(UnownedNamespaceTest, ANamespaceThatNobodyOwnsCannotWrap)
 
 TEST(SpellingTest, TwoSpellingsGiveTwoWrappersOfOneClass)
 {
-    TComparison comparison(EHost::kInmem);
+    TComparisonRun comparison(EHost::kInmem);
     comparison.Namespace(0).Class("Disk", "", {TNamespaceBuilder::Key("Id")});
     comparison.Prepare();
     TCallContext context;

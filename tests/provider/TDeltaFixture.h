@@ -6,7 +6,7 @@
 #include <string>
 
 #include "tests/support/TCapturingLogger.h"
-#include "tests/support/TComparison.h"
+#include "tests/support/TComparisonRun.h"
 
 namespace NORVZEL20 {
 
@@ -22,7 +22,7 @@ class TDeltaFixture : public testing::Test {
     TDeltaNamespace& Delta() { return fComparison.Delta(); }
 
     TCapturingLogger fLog;
-    TComparison fComparison;
+    TComparisonRun fComparison;
 };
 
 /// The status that the call throws, or 0 where it throws nothing.

@@ -7,7 +7,7 @@
 #include "spec/TDiffClassRules.h"
 #include "tests/support/Dump.h"
 #include "tests/support/TCapturingLogger.h"
-#include "tests/support/TComparison.h"
+#include "tests/support/TComparisonRun.h"
 #include "tests/support/TWatchedNamespace.h"
 
 namespace NORVZEL20 {

@@ -109,7 +109,7 @@ TEST_F(SpecFileLoadingTest, AReadErrorIsReportedAndLeavesTheFileOpen)
 
 TEST_F(SpecFileLoadingTest, WithoutMemoryTheFileIsNotRead)
 {
-    const TTemporaryFile file("<DifftoolSpec/>");
+    const TScratchFile file("<DifftoolSpec/>");
     gIsMemoryShort = true;
     EXPECT_EQ("status 4", ReadFile(file.GetPath()));
     gFileSize = kLimit;
@@ -129,7 +129,7 @@ TEST_F(SpecFileLoadingTest, AFileAboveTheLimitIsRefusedBeforeItIsOpened)
 
 TEST_F(SpecFileLoadingTest, AFileAtTheLimitIsRead)
 {
-    const TTemporaryFile file("<DifftoolSpec><class name=\"Other\"/></DifftoolSpec>");
+    const TScratchFile file("<DifftoolSpec><class name=\"Other\"/></DifftoolSpec>");
     {
         std::ofstream out(file.GetPath(), std::ios::app);
         out << std::string(kLimit - std::filesystem::file_size(file.GetPath()), ' ');
@@ -159,14 +159,14 @@ TEST_F(SpecFileLoadingTest, TheParserGetsTheFilesBytesAndNoMore)
 
 TEST_F(SpecFileLoadingTest, AFileThatShrankIsReadAsItIs)
 {
-    const TTemporaryFile file("<DifftoolSpec/>");
+    const TScratchFile file("<DifftoolSpec/>");
     gFileSize = 1000;
     EXPECT_EQ("", ReadFile(file.GetPath()));
 }
 
 TEST_F(SpecFileLoadingTest, AFileThatGrewIsReadUpToTheSizeItHad)
 {
-    const TTemporaryFile file("<DifftoolSpec/><!-- open");
+    const TScratchFile file("<DifftoolSpec/><!-- open");
     gFileSize = 15;
     EXPECT_EQ("", ReadFile(file.GetPath()));
 }

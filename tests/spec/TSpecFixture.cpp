@@ -29,7 +29,7 @@ TSpecFixture::TSpecFixture() : fComparison(EHost::kPlain)
 
 std::string TSpecFixture::Read(const std::string& document)
 {
-    const TTemporaryFile file(document);
+    const TScratchFile file(document);
     return ReadFile(file.GetPath());
 }
 

@@ -8,7 +8,7 @@
 
 #include "engine/TCIMDiffEngine.h"
 #include "tests/support/TCapturingLogger.h"
-#include "tests/support/TComparison.h"
+#include "tests/support/TComparisonRun.h"
 
 namespace NORVZEL20 {
 
@@ -25,7 +25,7 @@ class TSpecFixture : public testing::Test {
     std::string TakeLog() { return fLog.Take(); }
 
     TCapturingLogger fLog;
-    TComparison fComparison;
+    TComparisonRun fComparison;
     std::vector<boost::shared_ptr<ICIMNamespace>> fNamespaces;
     std::unique_ptr<TCIMDiffEngine> fEngine;  // made without a specification; reads any number of them
 };

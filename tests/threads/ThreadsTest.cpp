@@ -11,8 +11,8 @@
 #include "host/TZELException.h"
 #include "tests/faults/DifferingNamespaces.h"
 #include "tests/support/Dump.h"
-#include "tests/support/TComparison.h"
-#include "tests/support/TTemporaryFile.h"
+#include "tests/support/TComparisonRun.h"
+#include "tests/support/TScratchFile.h"
 #include "tests/support/TTestAccess.h"
 
 namespace NORVZEL20 {
@@ -121,20 +121,20 @@ std::string MakeDocument()
 
 TEST(Threads, EightComparisonsOfTwoNamespacesAreAsOne)
 {
-    const TTemporaryFile rules(RulesForDiffering(true));
+    const TScratchFile rules(RulesForDiffering(true));
     ExpectAsAlone([&rules] { return Compare(2, rules.GetPath()); });
 }
 
 TEST(Threads, EightComparisonsOfThreeNamespacesAreAsOne)
 {
-    const TTemporaryFile rules(RulesForDiffering(false));
+    const TScratchFile rules(RulesForDiffering(false));
     ExpectAsAlone([&rules] { return Compare(3, rules.GetPath()); });
 }
 
 TEST(Threads, EightComparisonsThatFailLogEach)
 {
     TCountingLogger log;
-    const TTemporaryFile rules("<DifftoolSpec><class name='Nowhere'/></DifftoolSpec>");
+    const TScratchFile rules("<DifftoolSpec><class name='Nowhere'/></DifftoolSpec>");
     ExpectAsAlone([&rules]() -> std::string {
         try {
             return Compare(2, rules.GetPath());
@@ -147,7 +147,7 @@ TEST(Threads, EightComparisonsThatFailLogEach)
 
 TEST(Threads, EightInventoriesLoadAsOne)
 {
-    const TTemporaryFile file(MakeDocument());
+    const TScratchFile file(MakeDocument());
     ExpectAsAlone([&file] {
         const auto ns = MakeNamespace(EHost::kInmem, "root/cimv2");
         TCimXmlPopulator(ns).LoadFile(file.GetPath());

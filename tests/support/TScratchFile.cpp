@@ -1,4 +1,4 @@
-#include "tests/support/TTemporaryFile.h"
+#include "tests/support/TScratchFile.h"
 
 #include <unistd.h>
 
@@ -9,7 +9,7 @@
 
 namespace NORVZEL20 {
 
-TTemporaryFile::TTemporaryFile(const std::string& contents)
+TScratchFile::TScratchFile(const std::string& contents)
 {
     const char* folder = std::getenv("TMPDIR");
     fPath = std::string(folder ? folder : "/tmp") + "/cimdelta-test-XXXXXX";
@@ -21,7 +21,7 @@ TTemporaryFile::TTemporaryFile(const std::string& contents)
     std::ofstream(fPath, std::ios::binary) << contents;
 }
 
-TTemporaryFile::~TTemporaryFile()
+TScratchFile::~TScratchFile()
 {
     std::remove(fPath.c_str());
 }

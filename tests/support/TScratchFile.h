@@ -5,12 +5,12 @@
 namespace NORVZEL20 {
 
 /// A file with the given contents, removed with this object.
-class TTemporaryFile {
+class TScratchFile {
   public:
-    explicit TTemporaryFile(const std::string& contents);
-    TTemporaryFile(const TTemporaryFile&) = delete;
-    TTemporaryFile& operator=(const TTemporaryFile&) = delete;
-    ~TTemporaryFile();
+    explicit TScratchFile(const std::string& contents);
+    TScratchFile(const TScratchFile&) = delete;
+    TScratchFile& operator=(const TScratchFile&) = delete;
+    ~TScratchFile();
 
     const std::string& GetPath() const { return fPath; }
 

@@ -9,7 +9,7 @@
 #include "provider/TDeltaNamespace.h"
 #include "tests/support/TCallWatch.h"
 #include "tests/support/TNamespaceBuilder.h"
-#include "tests/support/TTemporaryFile.h"
+#include "tests/support/TScratchFile.h"
 
 namespace NORVZEL20 {
 
@@ -29,12 +29,12 @@ boost::shared_ptr<TDeltaNamespace> MakeDeltaNamespace(EHost host);
 /// A delta namespace, the namespaces it compares, and its specification, all watched.
 ///
 /// The namespaces are made as they are named, each with KALMO_OperatingSystem; they join the compare list at the first run.
-class TComparison {
+class TComparisonRun {
   public:
-    explicit TComparison(EHost host);
-    TComparison(const TComparison&) = delete;
-    TComparison& operator=(const TComparison&) = delete;
-    ~TComparison();
+    explicit TComparisonRun(EHost host);
+    TComparisonRun(const TComparisonRun&) = delete;
+    TComparisonRun& operator=(const TComparisonRun&) = delete;
+    ~TComparisonRun();
 
     /// The namespace at that position; made, with all before it, where it is not there yet.
     TNamespaceBuilder& Namespace(std::size_t index);
@@ -72,7 +72,7 @@ class TComparison {
     boost::shared_ptr<TDeltaNamespace> fDelta;
     boost::shared_ptr<ICIMNamespace> fStore;
     std::vector<std::unique_ptr<TNamespaceBuilder>> fBuilders;
-    std::unique_ptr<TTemporaryFile> fRules;
+    std::unique_ptr<TScratchFile> fRules;
 };
 
 }  // namespace NORVZEL20

@@ -1,4 +1,4 @@
-#include "tests/support/TComparison.h"
+#include "tests/support/TComparisonRun.h"
 
 #include <algorithm>
 #include <boost/smart_ptr/make_shared.hpp>
@@ -37,24 +37,24 @@ boost::shared_ptr<TDeltaNamespace> MakeDeltaNamespace(EHost host)
     return delta;
 }
 
-TComparison::TComparison(EHost host)
+TComparisonRun::TComparisonRun(EHost host)
     : fHost(host), fWatch(boost::make_shared<TCallWatch>()), fDelta(MakeDeltaNamespace(host)), fStore(TTestAccess::Store(*fDelta))
 {
     TTestAccess::SetStore(*fDelta, boost::make_shared<TWatchedNamespace>(fStore, fWatch, "store"));
 }
 
-TComparison::~TComparison()
+TComparisonRun::~TComparisonRun()
 {
     TTestAccess::ForgetWrappers(*fDelta);
 }
 
-TNamespaceBuilder& TComparison::Namespace(std::size_t index)
+TNamespaceBuilder& TComparisonRun::Namespace(std::size_t index)
 {
     SetNamespaceCount(std::max(index + 1, fBuilders.size()));
     return *fBuilders[index];
 }
 
-void TComparison::SetNamespaceCount(std::size_t count)
+void TComparisonRun::SetNamespaceCount(std::size_t count)
 {
     while (fBuilders.size() < count) {
         fBuilders.push_back(std::make_unique<TNamespaceBuilder>(MakeNamespace(fHost, "root/cimv2")));
@@ -64,18 +64,18 @@ void TComparison::SetNamespaceCount(std::size_t count)
     }
 }
 
-void TComparison::Rules(const std::string& xml)
+void TComparisonRun::Rules(const std::string& xml)
 {
-    fRules = std::make_unique<TTemporaryFile>(xml);
+    fRules = std::make_unique<TScratchFile>(xml);
     fDelta->SetSpecFileName(fRules->GetPath());
 }
 
-const std::string& TComparison::GetRulesPath() const
+const std::string& TComparisonRun::GetRulesPath() const
 {
     return fRules->GetPath();
 }
 
-void TComparison::Prepare()
+void TComparisonRun::Prepare()
 {
     if (!fPrepared) {
         for (const auto& ns : AllWatched()) {
@@ -85,7 +85,7 @@ void TComparison::Prepare()
     }
 }
 
-std::string TComparison::Run()
+std::string TComparisonRun::Run()
 {
     Prepare();
     try {
@@ -96,23 +96,23 @@ std::string TComparison::Run()
     return "";
 }
 
-std::string TComparison::Records() const
+std::string TComparisonRun::Records() const
 {
     return DumpRecords(fStore);
 }
 
-std::string TComparison::RecordsAfterRun()
+std::string TComparisonRun::RecordsAfterRun()
 {
     const std::string status = Run();
     return Records() + status;
 }
 
-boost::shared_ptr<ICIMNamespace> TComparison::Watched(std::size_t index)
+boost::shared_ptr<ICIMNamespace> TComparisonRun::Watched(std::size_t index)
 {
     return boost::make_shared<TWatchedNamespace>(Namespace(index).GetNamespace(), fWatch, "ns" + std::to_string(index));
 }
 
-std::vector<boost::shared_ptr<ICIMNamespace>> TComparison::AllWatched()
+std::vector<boost::shared_ptr<ICIMNamespace>> TComparisonRun::AllWatched()
 {
     std::vector<boost::shared_ptr<ICIMNamespace>> all;
     for (std::size_t index = 0; index < fBuilders.size(); ++index) {
