@@ -90,9 +90,13 @@ std::size_t TInventoryFile::Read(char* buffer, std::size_t size)
 
 void TInventoryFile::Fail() const
 {
-    const char* reason = archive_error_string(fArchive.get());
-    throw TClientError(fName + ": cannot be read: " + (reason == nullptr ? "unknown reason" : reason) +
-                       "; is the file whole? (plain, gzip, xz and zstd are understood)");
+    const char* const told = archive_error_string(fArchive.get());
+    std::string reason = told == nullptr ? "unknown reason" : told;
+    // What the decompressor of xz says of data that ends early helps nobody.
+    if (reason.find("No progress is possible") != std::string::npos) {
+        reason = "truncated xz input";
+    }
+    throw TClientError(fName + ": cannot be read: " + reason + "; is the file whole? (plain, gzip, xz and zstd are understood)");
 }
 
 }  // namespace NORVZEL20
