@@ -43,11 +43,11 @@ boost::shared_ptr<TDeltaNamespace> MakeDeltaNamespace()
 }
 
 // A class that excludes keys makes the delta namespace hold itself through its class wrappers, by design of the plug-in. It lives
-// until the process ends, and this keeps it in sight.
+// until the process ends, and this keeps it in sight: the list is never destroyed either.
 void KeepForever(const boost::shared_ptr<TDeltaNamespace>& records)
 {
-    static std::vector<boost::shared_ptr<TDeltaNamespace>> fgKept;
-    fgKept.push_back(records);
+    static auto* const fgKept = new std::vector<boost::shared_ptr<TDeltaNamespace>>;
+    fgKept->push_back(records);
 }
 
 // Takes a position off all records.

@@ -74,6 +74,9 @@ constexpr std::size_t kBuckets = 256;
 
 constexpr std::size_t GetBucket(std::string_view name)
 {
+    if (name.empty()) {
+        return 0;
+    }
     const auto at = [&](std::size_t index) { return static_cast<unsigned char>(name[index]); };
     return (name.size() * 37 + at(0) * 7 + at(name.size() - 1) * 11 + at(name.size() / 2) * 3) % kBuckets;
 }
