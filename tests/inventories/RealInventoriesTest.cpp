@@ -47,6 +47,19 @@ TEST_F(PackageIndexTest, SecurityUpdatesDifferAsListed)
     ExpectDifferencesOf("c.xml.xz", "oracle-ac.tsv.xz", 913);
 }
 
+class LosslessTest : public testing::TestWithParam<const char*> {};
+
+TEST_P(LosslessTest, WhatIsLoadedWrittenAndLoadedAgainIsTheSame)
+{
+    const std::string written = WriteInventory(*LoadInventory(kData + GetParam()));
+    EXPECT_GT(written.size(), 90000U);
+    EXPECT_TRUE(written == WriteInventory(*LoadInventoryText(written)));
+}
+
+INSTANTIATE_TEST_SUITE_P(PackageIndexAndTypes, LosslessTest,
+                         testing::Values("/pair/a.xml.xz", "/pair/b.xml.xz", "/pair/c.xml.xz", "/typepair/A.xml",
+                                         "/typepair/B.xml"));
+
 // The list compares texts. Here 0 equals -0, a real32 is what 32 bits hold of it, a datetime is an instant whatever its offset, and
 // the name of an embedded object's class has no letter case.
 const std::set<std::string> kEqualInValue = {

@@ -11,6 +11,7 @@
 
 #include "client/TInventoryFile.h"
 #include "embedded/TCimXmlPopulator.h"
+#include "embedded/TCimXmlWriter.h"
 #include "embedded/TInMemInstance.h"
 #include "embedded/TInMemProperty.h"
 #include "host/TNamespaceProviderManager.h"
@@ -28,16 +29,6 @@ const char kOperatingSystem[] =
     "<PROPERTY NAME=\"Name\" TYPE=\"string\"><VALUE>os</VALUE></PROPERTY><PROPERTY NAME=\"OSType\" "
     "TYPE=\"uint16\"><VALUE>36</VALUE>"
     "</PROPERTY></INSTANCE></VALUE.OBJECT></DECLGROUP></DECLARATION></CIM>";
-
-boost::shared_ptr<TInMemNamespace> Load(const std::string& path)
-{
-    boost::shared_ptr<TInMemNamespace> ns = TInMemNamespace::Create("root/cimv2");
-    TInventoryFile file(path);
-    TCimXmlPopulator populator(ns);
-    populator.LoadFromSource([&file](char* buffer, std::size_t size) { return file.Read(buffer, size); }, path);
-    populator.LoadFromMemory(kOperatingSystem, sizeof kOperatingSystem - 1, "operating system");
-    return ns;
-}
 
 TJson ToJson(const TCIMValue& value)
 {
@@ -69,10 +60,39 @@ TCIMValue ValueOf(ICIMInstance& record, const char* property)
     return record.GetProperty(property, TCallContext())->GetValue(TCallContext());
 }
 
+boost::shared_ptr<TInMemNamespace> LoadWithOperatingSystem(const std::string& path)
+{
+    const boost::shared_ptr<TInMemNamespace> ns = LoadInventory(path);
+    TCimXmlPopulator(ns).LoadFromMemory(kOperatingSystem, sizeof kOperatingSystem - 1, "operating system");
+    return ns;
+}
+
 }  // namespace
 
+boost::shared_ptr<TInMemNamespace> LoadInventory(const std::string& path)
+{
+    const boost::shared_ptr<TInMemNamespace> ns = TInMemNamespace::Create("root/cimv2");
+    TInventoryFile file(path);
+    TCimXmlPopulator(ns).LoadFromSource([&file](char* buffer, std::size_t size) { return file.Read(buffer, size); }, path);
+    return ns;
+}
+
+boost::shared_ptr<TInMemNamespace> LoadInventoryText(const std::string& xml)
+{
+    const boost::shared_ptr<TInMemNamespace> ns = TInMemNamespace::Create("root/cimv2");
+    TCimXmlPopulator(ns).LoadFromMemory(xml.data(), xml.size(), "text");
+    return ns;
+}
+
+std::string WriteInventory(TInMemNamespace& ns)
+{
+    std::string xml;
+    TCimXmlWriter([&xml](std::string_view piece) { xml += piece; }).WriteNamespace(ns);
+    return xml;
+}
+
 TInventoryRun::TInventoryRun(const std::string& reference, const std::string& other)
-    : fReference(Load(reference)), fOther(Load(other)),
+    : fReference(LoadWithOperatingSystem(reference)), fOther(LoadWithOperatingSystem(other)),
       fDelta(boost::dynamic_pointer_cast<TDeltaNamespace>(
           TNamespaceProviderManager::GetInstance()->FindProvider("delta")->AllocateNamespace(TCallContext(), false, "delta")))
 {}

@@ -10,6 +10,11 @@
 
 namespace NORVZEL20 {
 
+/// The inventory in a file, compressed or not, or in a text; and the text of one.
+boost::shared_ptr<TInMemNamespace> LoadInventory(const std::string& path);
+boost::shared_ptr<TInMemNamespace> LoadInventoryText(const std::string& xml);
+std::string WriteInventory(TInMemNamespace& ns);
+
 /// A comparison of two inventory files through the plug-in, told as lines like those of ReadOracle.
 class TInventoryRun {
   public:
