@@ -3,7 +3,6 @@
 #include <boost/smart_ptr/make_shared.hpp>
 #include <utility>
 
-
 // What TCimXmlReader does for declarations and for the frames of messages.
 namespace NORVZEL20 {
 

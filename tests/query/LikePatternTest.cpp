@@ -24,7 +24,7 @@ TEST(LikePatternTest, EachPatternFitsItsTextsAndNoOther)
                 {"%c", "abc", true},
                 {"%c", "abcd", false},
                 {"aa%a", "aa", false},
-        {"a%c", "abcabc", true},
+                {"a%c", "abcabc", true},
                 {"a%b%c", "axxbxxc", true},
                 {"a%b%c", "axxcxxb", false},
                 {"_", "a", true},
