@@ -233,7 +233,8 @@ void TCimXmlReader::EndInstance()
     const bool isNamed = fLoader != nullptr && fPaths.HasOwnPath();
     if (fDirect) {
         fDirect = false;
-        return fLoader->EndInstance(isNamed ? &fPaths.GetOwnKeys() : nullptr);
+        // Only a loader starts an instance directly, so there is one.
+        return fLoader->EndInstance(isNamed ? &fPaths.GetOwnKeys() : nullptr);  // NOLINT(clang-analyzer-core.CallAndMessage)
     }
     TCimXmlDraft draft = fDraft.Take();
     if (fLoader == nullptr) {
