@@ -12,10 +12,10 @@ namespace {
 class ExecutableTest : public ClientTest {
   protected:
     /// Gives exit status, standard output and standard error, one after the other.
-    std::string Shell(const std::string& arguments)
+    std::string Shell(const std::string& arguments, const std::string& before = std::string())
     {
         const std::string err = Scratch("stderr", "");
-        const std::string command = std::string(CIMDELTA_PROGRAM) + " " + arguments + " 2>" + err;
+        const std::string command = before + CIMDELTA_PROGRAM + " " + arguments + " 2>" + err;
         std::FILE* pipe = popen(command.c_str(), "r");
         std::string out;
         std::array<char, 4096> buffer;
@@ -69,6 +69,33 @@ TEST_F(ExecutableTest, AnOutputFileStaysWhereTroubleComesUp)
     EXPECT_EQ("what was there before", ReadFile(file));
     EXPECT_EQ("[2]\n--\ncimdelta: /nowhere/report: cannot be written: No such file or directory\n",
               Shell("compare --output /nowhere/report web01.xml web02.xml"));
+}
+
+TEST_F(ExecutableTest, AnOutputFileThatFindsNoRoomLeavesWhatWasThere)
+{
+    const std::string file = Scratch("report", "what was there before");
+    const std::string noRoom = "ulimit -f 100; trap '' XFSZ; ";
+    EXPECT_EQ("[2]\n--\ncimdelta: " + file + ": cannot be written: File too large\n",
+              Shell("show " CIMDELTA_PAIR_DATA "/a.xml.xz -o cimxml --output " + file, noRoom));
+    EXPECT_EQ("what was there before", ReadFile(file));
+    EXPECT_EQ(0, std::system(("test -z \"$(ls " + file + ".* 2>/dev/null)\"").c_str()));
+}
+
+TEST_F(ExecutableTest, AWriterThatIsKilledLeavesWhatWasThere)
+{
+    const std::string file = Scratch("report", "what was there before");
+    const std::string write = std::string(CIMDELTA_PROGRAM) + " show " CIMDELTA_PAIR_DATA "/a.xml.xz -o cimxml --output " + file;
+    // Killed as soon as a part of the new file can be seen beside the old one; status 3 where the writer was faster.
+    const std::string kill = "bash -c '" + write + " & while set -- " + file +
+                             ".*; ! test -s \"$1\"; do kill -0 $! || exit 3; done; " +
+                             "kill -KILL $!; wait $!; test $? = 137 || exit 3; rm " + file + ".*' 2>/dev/null";
+    bool killed = false;
+    for (int attempt = 0; attempt < 20 && !killed; ++attempt) {
+        Scratch("report", "what was there before");
+        killed = std::system(kill.c_str()) == 0;
+    }
+    ASSERT_TRUE(killed) << "the writer was never caught in the middle";
+    EXPECT_EQ("what was there before", ReadFile(file));
 }
 
 TEST_F(ExecutableTest, AFullDeviceIsTold)
