@@ -47,6 +47,24 @@ void AppendNamespacePath(std::string& out, const std::string& name)
     out += "</LOCALNAMESPACEPATH>\n";
 }
 
+void AppendQualifierDecl(std::string& out, const ICIMQualifierDecl& decl)
+{
+    const TCIMValue& value = decl.GetValue(TCallContext());
+    const TDecl::EFlavor flavor = decl.GetFlavor(TCallContext());
+    out += "<QUALIFIER.DECLARATION";
+    TValueXml::AppendAttribute(out, "NAME", decl.GetName(TCallContext()));
+    TValueXml::AppendAttribute(out, "TYPE", TValueText::GetTypeName(value.GetType()));
+    AppendFlag(out, "ISARRAY", value.GetType().IsArray());
+    AppendFlag(out, "OVERRIDABLE", (flavor & TDecl::kFlavorOverridable) != 0);
+    AppendFlag(out, "TOSUBCLASS", (flavor & TDecl::kFlavorToSubclass) != 0);
+    AppendFlag(out, "TOINSTANCE", (flavor & TDecl::kFlavorToInstance) != 0);
+    AppendFlag(out, "TRANSLATABLE", (flavor & TDecl::kFlavorTranslatable) != 0);
+    out += '>';
+    AppendScope(out, decl.GetScope(TCallContext()));
+    TValueXml::AppendValue(out, value);
+    out += "</QUALIFIER.DECLARATION>\n";
+}
+
 void AppendInstance(std::string& out, const ICIMInstance& instance)
 {
     out += "<INSTANCE";
@@ -102,44 +120,48 @@ std::vector<boost::shared_ptr<ICIMClass>> TCimXmlWriter::CollectClasses(ICIMName
 
 void TCimXmlWriter::StartDocument(const std::string& namespaceName)
 {
+    fBuffer.clear();  // of what a document that failed may have left
     fBuffer += "<?xml version=\"1.0\" encoding=\"utf-8\"?>\n<CIM CIMVERSION=\"2.0\" DTDVERSION=\"2.0\"><DECLARATION><DECLGROUP>\n";
     if (!namespaceName.empty())
         AppendNamespacePath(fBuffer, namespaceName);
 }
 
+/// Appends what `append` appends, or, where that throws, nothing.
+template <class TAppend>
+void TCimXmlWriter::WriteElement(const TAppend& append)
+{
+    const std::size_t start = fBuffer.size();
+    try {
+        append(fBuffer);
+    } catch (...) {
+        fBuffer.resize(start);
+        throw;
+    }
+    if (fBuffer.size() >= kPiece)
+        Flush();
+}
+
 void TCimXmlWriter::WriteQualifierDecl(const ICIMQualifierDecl& decl)
 {
-    const TCIMValue& value = decl.GetValue(TCallContext());
-    const TDecl::EFlavor flavor = decl.GetFlavor(TCallContext());
-    fBuffer += "<QUALIFIER.DECLARATION";
-    TValueXml::AppendAttribute(fBuffer, "NAME", decl.GetName(TCallContext()));
-    TValueXml::AppendAttribute(fBuffer, "TYPE", TValueText::GetTypeName(value.GetType()));
-    AppendFlag(fBuffer, "ISARRAY", value.GetType().IsArray());
-    AppendFlag(fBuffer, "OVERRIDABLE", (flavor & TDecl::kFlavorOverridable) != 0);
-    AppendFlag(fBuffer, "TOSUBCLASS", (flavor & TDecl::kFlavorToSubclass) != 0);
-    AppendFlag(fBuffer, "TOINSTANCE", (flavor & TDecl::kFlavorToInstance) != 0);
-    AppendFlag(fBuffer, "TRANSLATABLE", (flavor & TDecl::kFlavorTranslatable) != 0);
-    fBuffer += '>';
-    AppendScope(fBuffer, decl.GetScope(TCallContext()));
-    TValueXml::AppendValue(fBuffer, value);
-    fBuffer += "</QUALIFIER.DECLARATION>\n";
-    FlushWhenFull();
+    WriteElement([&](std::string& out) { AppendQualifierDecl(out, decl); });
 }
 
 void TCimXmlWriter::WriteClass(const ICIMClass& cls)
 {
-    fBuffer += "<VALUE.OBJECT>";
-    TValueXml::AppendObject(fBuffer, TCimXmlObjects::FromClass(cls));
-    fBuffer += "</VALUE.OBJECT>\n";
-    FlushWhenFull();
+    WriteElement([&](std::string& out) {
+        out += "<VALUE.OBJECT>";
+        TValueXml::AppendObject(out, TCimXmlObjects::FromClass(cls));
+        out += "</VALUE.OBJECT>\n";
+    });
 }
 
 void TCimXmlWriter::WriteInstance(const ICIMInstance& instance)
 {
-    fBuffer += "<VALUE.OBJECT>";
-    AppendInstance(fBuffer, instance);
-    fBuffer += "</VALUE.OBJECT>\n";
-    FlushWhenFull();
+    WriteElement([&](std::string& out) {
+        out += "<VALUE.OBJECT>";
+        AppendInstance(out, instance);
+        out += "</VALUE.OBJECT>\n";
+    });
 }
 
 void TCimXmlWriter::EndDocument()
@@ -153,12 +175,6 @@ std::string TCimXmlWriter::InstanceToXml(const ICIMInstance& instance)
     std::string text;
     AppendInstance(text, instance);
     return text;
-}
-
-void TCimXmlWriter::FlushWhenFull()
-{
-    if (fBuffer.size() >= kPiece)
-        Flush();
 }
 
 void TCimXmlWriter::Flush()

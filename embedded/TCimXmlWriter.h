@@ -16,7 +16,8 @@ namespace NORVZEL20 {
 ///
 /// Text reaches the sink in pieces of some 64 KiB, in UTF-8; nothing is held beyond that. What XML readers would change is
 /// written as a character reference; a control character that XML 1.0 cannot carry becomes U+FFFD. Output depends on the contents
-/// of the namespace alone. Errors: what the sink or the namespace throws.
+/// of the namespace alone. Errors: what the sink or the namespace throws; an element that could not be told whole is not written at
+/// all, a piece that the sink refused is offered again by what is written next, and StartDocument begins anew.
 class TCimXmlWriter {
   public:
     using TSink = boost::function<void(std::string_view)>;
@@ -43,8 +44,9 @@ class TCimXmlWriter {
 
   private:
     static std::vector<boost::shared_ptr<ICIMClass>> CollectClasses(ICIMNamespace& ns);
+    template <class TAppend>
+    void WriteElement(const TAppend& append);
     void Flush();
-    void FlushWhenFull();
 
     TSink fSink;
     std::string fBuffer;

@@ -93,14 +93,19 @@ void TInMemClass::RemoveFromNamespace(TCallContext)
 void TInMemClass::ModifyClass(boost::shared_ptr<ICIMClass> cls, TCallContext context)
 {
     TDeclCopy::CheckTypes(*cls, *this);
+    std::vector<boost::shared_ptr<TInMemPropertyDecl>> missing;
     cls->EnumeratePropertyDecls(
-        [this](boost::shared_ptr<ICIMPropertyDecl> decl) {
+        [this, &missing](boost::shared_ptr<ICIMPropertyDecl> decl) {
             if (!FindPropertyDecl(decl->GetName(TCallContext()))) {
-                AddPropertyDecl(TDeclCopy::CopyProperty(*decl));
+                missing.push_back(TDeclCopy::CopyProperty(*decl));
+                CheckOverrides(*missing.back());
             }
             return true;
         },
         context);
+    for (const auto& decl : missing) {
+        AddPropertyDecl(decl);
+    }
     cls->EnumerateMethodDecls(
         [this](boost::shared_ptr<ICIMMethodDecl> decl) {
             if (!FindMethodDecl(decl->GetName(TCallContext()))) {
@@ -327,7 +332,7 @@ void TInMemClass::SetSpelling(const std::string& name)
     }
     std::copy(name.begin(), name.end(), fName.begin());
     if (const auto ns = fNamespace.lock()) {
-        ns->ReindexReferences();
+        ns->ReferenceTextsChanged();
     }
 }
 

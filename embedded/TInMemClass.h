@@ -159,7 +159,7 @@ class TInMemClass final : public TInMemNamedElement<ICIMClass>, public boost::en
     void AppendSlot(const boost::shared_ptr<TInMemPropertyDecl>& decl);
     void CheckOverrides(const TInMemPropertyDecl& decl) const;
     void ReserveSlot();
-    void DeclChanged(const TInMemPropertyDecl& decl);
+    std::vector<boost::shared_ptr<TInMemClass>> PrepareChange();
     void DeclChanged(const TInMemPropertyDecl& decl, const std::vector<boost::shared_ptr<TInMemClass>>& below);
     void MethodChanged(std::string_view name);
     void UpdateLayout();

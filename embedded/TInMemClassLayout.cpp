@@ -105,20 +105,26 @@ void TInMemClass::AppendSlot(const boost::shared_ptr<TInMemPropertyDecl>& decl)
 /// Makes room, so that one slot more, a key too, can be added without a failure.
 void TInMemClass::ReserveSlot()
 {
-    const auto reserve = [](auto& list) {
-        if (list.size() == list.capacity()) {
-            list.reserve(2 * list.size() + 1);
+    const auto reserve = [](auto& list, std::size_t count) {
+        if (count > list.capacity()) {
+            list.reserve(2 * count);
         }
     };
-    reserve(fSlots);
-    reserve(fOrder);
-    reserve(fKeySlots);
+    reserve(fSlots, fSlots.size() + 1);
+    reserve(fOrder, fSlots.size() + 1);
+    reserve(fKeySlots, fKeySlots.size() + 1);
     fSlotIndex.Reserve(fSlots.size() + 1);
 }
 
-void TInMemClass::DeclChanged(const TInMemPropertyDecl& decl)
+/// Makes room here and below, so that DeclChanged cannot fail; returns the classes below.
+std::vector<boost::shared_ptr<TInMemClass>> TInMemClass::PrepareChange()
 {
-    DeclChanged(decl, GetClassesBelow());
+    auto below = GetClassesBelow();
+    ReserveSlot();
+    for (const auto& cls : below) {
+        cls->ReserveSlot();
+    }
+    return below;
 }
 
 void TInMemClass::DeclChanged(const TInMemPropertyDecl& decl, const std::vector<boost::shared_ptr<TInMemClass>>& below)
@@ -172,7 +178,7 @@ void TInMemClass::UpdateKeys()
     changed = changed || count < fKeySlots.size();
     fKeySlots.resize(count);
     if (changed && fExtent) {
-        fExtent->Reindex();
+        fExtent->KeysChanged();
     }
 }
 
@@ -241,11 +247,7 @@ bool TInMemClass::AddPropertyDecl(boost::shared_ptr<ICIMPropertyDecl> decl)
         throw TZELException(TZELStatusCode::kInvalidParameter);
     }
     CheckOverrides(*own);
-    const auto below = GetClassesBelow();
-    ReserveSlot();
-    for (const auto& cls : below) {
-        cls->ReserveSlot();
-    }
+    const auto below = PrepareChange();
     fOwn.push_back(own);
     own->fOwner = weak_from_this();
     if (there || !fSubClasses.empty()) {

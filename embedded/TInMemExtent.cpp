@@ -38,6 +38,7 @@ TInMemExtent::~TInMemExtent()
 void TInMemExtent::Add(const boost::shared_ptr<TInMemInstance>& instance)
 {
     CheckKeys(*instance);
+    Refresh();
     if (fInstances.size() == fInstances.capacity()) {
         fInstances.reserve(fInstances.size() + fInstances.size() / 2 + 2);
     }
@@ -60,6 +61,7 @@ void TInMemExtent::Check(const TInMemInstance& instance) const
             return;  // a number of its own will be generated
         }
     }
+    Refresh();
     CheckNew(HashOf(instance), instance);
 }
 
@@ -124,6 +126,7 @@ bool TInMemExtent::HasSameKeys(const TInMemInstance& a, const TInMemInstance& b)
 
 boost::shared_ptr<TInMemInstance> TInMemExtent::Find(const std::vector<TCIMValue>& keys) const
 {
+    Refresh();
     std::uint32_t hash = 0;
     for (const TCIMValue& key : keys) {
         hash = Mix(hash, key);
@@ -224,17 +227,28 @@ void TInMemExtent::RollBack(const TMark& mark) noexcept
     fNextGenerated = mark.nextGenerated;
 }
 
-void TInMemExtent::Reindex()
+void TInMemExtent::Refresh() const
 {
+    if (!fIsStale) {
+        return;
+    }
+    // Hashing may fail, and the instances must not be touched before it has not.
+    std::vector<std::uint32_t> hashes(fInstances.size());
     THashIndex index;
     index.Reserve(fCount);
     for (std::uint32_t ordinal = 0; ordinal < fInstances.size(); ++ordinal) {
         if (fInstances[ordinal]) {
-            fInstances[ordinal]->fKeyHash = HashOf(*fInstances[ordinal]);
-            index.Add(fInstances[ordinal]->fKeyHash, ordinal);
+            hashes[ordinal] = HashOf(*fInstances[ordinal]);
+            index.Add(hashes[ordinal], ordinal);
+        }
+    }
+    for (std::uint32_t ordinal = 0; ordinal < fInstances.size(); ++ordinal) {
+        if (fInstances[ordinal]) {
+            fInstances[ordinal]->fKeyHash = hashes[ordinal];
         }
     }
     fIndex.Swap(index);
+    fIsStale = false;
 }
 
 }  // namespace NORVZEL20

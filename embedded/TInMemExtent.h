@@ -46,10 +46,12 @@ class TInMemExtent {
     /// Takes out what was added since; nothing may have been removed since.
     void RollBack(const TMark& mark) noexcept;
 
-    /// To be called after the class's keys have changed.
-    void Reindex();
+    /// To be called after the class's keys, or the texts of its references, have changed. The index is made anew when it is next
+    /// asked for keys, so that any number of changes costs one pass.
+    void KeysChanged() noexcept { fIsStale = true; }
 
   private:
+    void Refresh() const;
     std::uint32_t HashOf(const TInMemInstance& instance) const;
     bool HasSameKeys(const TInMemInstance& a, const TInMemInstance& b) const;
     void CheckNew(std::uint32_t hash, const TInMemInstance& instance) const;
@@ -61,7 +63,8 @@ class TInMemExtent {
 
     const TInMemClass& fClass;
     std::vector<boost::shared_ptr<TInMemInstance>> fInstances;  // null where one was removed
-    THashIndex fIndex;
+    mutable THashIndex fIndex;  // by TInMemInstance::fKeyHash, also while it is stale
+    mutable bool fIsStale = false;
     std::size_t fCount = 0;
     std::uint64_t fNextGenerated = 1;
     mutable unsigned int fEnumerations = 0;  // in progress; the positions must not change meanwhile

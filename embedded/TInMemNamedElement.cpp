@@ -13,8 +13,7 @@ void TInMemNamedElement<TInterface>::AddQualifier(boost::shared_ptr<ICIMQualifie
     if (!qualifier) {
         throw TZELException(TZELStatusCode::kInvalidParameter);
     }
-    fQualifiers.Add(std::move(qualifier));
-    QualifiersChanged();
+    PutQualifier(std::move(qualifier));
 }
 
 template <class TInterface>

@@ -32,8 +32,8 @@ class TInMemNamedElement : public TInterface {
     void AddQualifier(boost::shared_ptr<ICIMQualifier> qualifier);
 
   protected:
-    /// Called whenever the qualifiers, own or inherited, may have changed.
-    virtual void QualifiersChanged() {}
+    /// Adds one that is not null, wholly or not at all; for elements that derive something from their qualifiers to override.
+    virtual void PutQualifier(boost::shared_ptr<ICIMQualifier> qualifier) { fQualifiers.Add(std::move(qualifier)); }
     void InheritQualifiers(const TInMemQualifierSet* parent) noexcept { fQualifiers.SetParent(parent); }
 
   private:

@@ -86,12 +86,12 @@ void TInMemNamespace::ClearInstances()
     }
 }
 
-void TInMemNamespace::ReindexReferences()
+void TInMemNamespace::ReferenceTextsChanged()
 {
     for (const auto& cls : fClasses) {
         for (const std::uint32_t slot : cls->GetKeySlots()) {
             if (cls->GetSlotDecl(slot).GetType() == TCIMValue::TCIMType::kReference) {
-                cls->GetExtent().Reindex();
+                cls->GetExtent().KeysChanged();
                 break;
             }
         }

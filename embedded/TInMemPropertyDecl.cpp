@@ -81,11 +81,14 @@ void TInMemPropertyDecl::SetSpelling(const std::string& name)
     std::copy(name.begin(), name.end(), fName.begin());
 }
 
-void TInMemPropertyDecl::QualifiersChanged()
+void TInMemPropertyDecl::PutQualifier(boost::shared_ptr<ICIMQualifier> qualifier)
 {
+    const auto owner = fOwner.lock();
+    const auto below = owner ? owner->PrepareChange() : std::vector<boost::shared_ptr<TInMemClass>>();
+    TInMemNamedElement<ICIMPropertyDecl>::PutQualifier(std::move(qualifier));
     UpdateMarks();
-    if (const auto owner = fOwner.lock()) {
-        owner->DeclChanged(*this);
+    if (owner) {
+        owner->DeclChanged(*this, below);
     }
 }
 

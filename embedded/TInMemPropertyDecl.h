@@ -64,7 +64,7 @@ class TInMemPropertyDecl : public TInMemNamedElement<ICIMPropertyDecl>, public b
   private:
     friend class TInMemClass;
 
-    void QualifiersChanged() override;
+    void PutQualifier(boost::shared_ptr<ICIMQualifier> qualifier) override;
     void UpdateMarks();
     bool IsBagDeclared() const;
     void Override(boost::shared_ptr<TInMemPropertyDecl> overridden);

@@ -1,6 +1,9 @@
 #include <gtest/gtest.h>
 
+#include <boost/smart_ptr/make_shared.hpp>
+
 #include "embedded/TInMemProperty.h"
+#include "embedded/TInMemQualifier.h"
 #include "tests/faults/FailEachAllocation.h"
 #include "tests/support/Dump.h"
 #include "tests/support/TComparisonRun.h"
@@ -19,7 +22,9 @@ const int kDisks = 40;
 boost::shared_ptr<ICIMNamespace> MakeDisks()
 {
     TNamespaceBuilder builder(MakeNamespace(EHost::kInmem, "root/cimv2"));
-    builder.Class("Disk", "", {TNamespaceBuilder::Key("Id"), TNamespaceBuilder::Property("Note")});
+    builder.Class("Disk", "",
+                  {TNamespaceBuilder::Key("Id"), TNamespaceBuilder::Property("Note"),
+                   TNamespaceBuilder::Property("Size", EType::kUint64)});
     builder.Class("Ssd", "Disk", {TNamespaceBuilder::Property("Wear", EType::kUint8)});
     for (int number = 0; number < kDisks; ++number) {
         builder.Instance("Disk", {{"Id", std::to_string(number)}, {"Note", kLong}});
@@ -35,6 +40,11 @@ TCIMReference PathOf(const std::string& id)
     return path;
 }
 
+boost::shared_ptr<ICIMQualifier> KeyQualifier()
+{
+    return boost::make_shared<TInMemQualifier>("Key", TCIMValue(true), ICIMQualifierDecl::kFlavorDefault);
+}
+
 /// The instances, with the earlier values of properties that were marked as changed.
 std::string DumpStore(boost::shared_ptr<ICIMNamespace> ns)
 {
@@ -46,6 +56,17 @@ std::string DumpStore(boost::shared_ptr<ICIMNamespace> ns)
     };
     ns->GetClass("Disk", kNone)->EnumerateInstances(append, false, kNone);
     return text;
+}
+
+std::vector<boost::shared_ptr<ICIMInstance>> InstancesOf(ICIMClass& cls)
+{
+    std::vector<boost::shared_ptr<ICIMInstance>> instances;
+    const auto append = [&instances](boost::shared_ptr<ICIMInstance> instance) {
+        instances.push_back(instance);
+        return true;
+    };
+    cls.EnumerateInstances(append, false, kNone);
+    return instances;
 }
 
 /// One change of a store, made wholly or not at all.
@@ -135,6 +156,55 @@ TEST(StoreOutOfMemory, AddingAPropertyToAClassInUseAddsItOrNot)
                   const auto cls = ns.GetClass("Disk", kNone);
                   cls->AddPropertyDecl(cls->AllocatePropertyDecl("Label", TCIMValue::Null(EType::kString), kNone));
               }));
+}
+
+TEST(StoreOutOfMemory, AddingAKeyToAClassInUseAddsItOrNot)
+{
+    EXPECT_EQ("bad_alloc", FailEach("AddKeyDecl", [](ICIMNamespace& ns) {
+                  const auto cls = ns.GetClass("Disk", kNone);
+                  const auto decl = cls->AllocatePropertyDecl("Bay", TCIMValue::Null(EType::kUint8), kNone);
+                  decl->AddQualifier(KeyQualifier(), kNone);
+                  cls->AddPropertyDecl(decl);
+              }));
+}
+
+TEST(StoreOutOfMemory, APropertyOfAClassInUseBecomesAKeyOrNot)
+{
+    EXPECT_EQ("bad_alloc", FailEach("AddKeyQualifier", [](ICIMNamespace& ns) {
+                  ns.GetClass("Disk", kNone)->GetPropertyDecl("Note", kNone)->AddQualifier(KeyQualifier(), kNone);
+              }));
+}
+
+TEST(StoreOutOfMemory, RemovingAPropertyOfAClassInUseRemovesItOrNot)
+{
+    EXPECT_EQ("bad_alloc", FailEach("RemovePropertyDecl", [](ICIMNamespace& ns) {
+                  const auto cls = ns.GetClass("Disk", kNone);
+                  cls->RemovePropertyDecl(cls->GetPropertyDecl("Size", kNone));
+              }));
+}
+
+/// Keys that came late make each instance allocate when it is found anew.
+TEST(StoreOutOfMemory, FindingByKeysThatHaveChangedFindsOrFails)
+{
+    const auto store = MakeDisks();
+    const auto cls = store->GetClass("Disk", kNone);
+    const auto decl = cls->AllocatePropertyDecl("Bay", TCIMValue::Null(EType::kUint8), kNone);
+    decl->AddQualifier(KeyQualifier(), kNone);
+    cls->AddPropertyDecl(decl);
+    std::vector<boost::shared_ptr<ICIMInstance>> disks = InstancesOf(*cls);
+    const TCIMReference path = disks.back()->GetReference(kNone);
+    std::size_t allocation = 0;
+    while (OutcomeOf([&] {
+               TFailingAllocator::Fail(++allocation);
+               store->GetInstance(path, kNone);
+           }) == "bad_alloc") {
+        ASSERT_GT(disks.size(), 1u);
+        EXPECT_TRUE(cls->RemoveInstance(disks.front())) << allocation;
+        disks.erase(disks.begin());
+    }
+    EXPECT_EQ(disks.back(), store->GetInstance(path, kNone));
+    EXPECT_GT(allocation, 5u);
+    EXPECT_EQ(disks, InstancesOf(*cls));
 }
 
 }  // namespace

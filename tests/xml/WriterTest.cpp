@@ -1,5 +1,6 @@
 #include <gtest/gtest.h>
 
+#include <stdexcept>
 #include <string>
 
 #include "embedded/TCimXmlWriter.h"
@@ -57,6 +58,51 @@ TEST(CimXmlWriterTest, DeclarationsComeBackAsTheyWereWritten)
     const std::string written = loading.Write();
     const std::size_t start = written.find("<QUALIFIER.DECL");
     EXPECT_EQ(declarations, written.substr(start, written.find("</DECLGROUP>") - start));
+}
+
+/// Takes pieces until the room is full; then it throws.
+class TNarrowSink {
+  public:
+    explicit TNarrowSink(std::size_t pieces) : fPieces(pieces) {}
+
+    void Take(std::string_view piece)
+    {
+        if (fPieces-- == 0)
+            throw std::runtime_error("no room");
+        fText += piece;
+    }
+    const std::string& GetText() const { return fText; }
+    void Empty(std::size_t pieces)
+    {
+        fText.clear();
+        fPieces = pieces;
+    }
+
+  private:
+    std::size_t fPieces;
+    std::string fText;
+};
+
+TEST(CimXmlWriterTest, WhatTheSinkThrowsReachesTheCallerAndTheNextDocumentBeginsAnew)
+{
+    TLoading loading;
+    std::string instances;
+    for (int number = 0; number < 3000; ++number)
+        instances += L::Instance("A", std::to_string(number));
+    loading.Load(L::Group(L::Class("A") + instances));
+    const std::string whole = loading.Write();
+    const std::size_t pieces = whole.size() / (64 * 1024) + 1;
+    ASSERT_GT(pieces, 3U);
+    for (std::size_t taken = 0; taken < pieces; ++taken) {
+        TNarrowSink sink(taken);
+        TCimXmlWriter writer([&sink](std::string_view piece) { sink.Take(piece); });
+        EXPECT_THROW(writer.WriteNamespace(*loading.GetNamespace()), std::runtime_error) << taken;
+        EXPECT_EQ(whole.substr(0, sink.GetText().size()), sink.GetText()) << taken;
+        EXPECT_EQ(taken > 0, sink.GetText().size() >= taken * 64 * 1024 && !sink.GetText().empty()) << taken;
+        sink.Empty(pieces);
+        writer.WriteNamespace(*loading.GetNamespace());
+        EXPECT_EQ(whole, sink.GetText()) << taken;
+    }
 }
 
 TEST(CimXmlWriterTest, AnInstanceIsOneElement)
