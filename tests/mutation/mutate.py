@@ -3,9 +3,9 @@
 
 Usage: mutate.py [--limit N] [--seed N] [--jobs N] [--only PATH-PREFIX] [--report FILE]
 
-Works on copies of the tree below build/mutate, one for each job. A mutant is killed when a test fails, crashes or runs too long; one that does not
-compile is no mutant. Survivors that are known to change nothing stand in accepted.tsv (path, text before, text after, reason); any other makes
-the run fail.
+Works on copies of the tree below build/mutate, one for each job. A mutant is killed when a test fails or crashes, and counted apart when one runs
+too long; one that does not compile is no mutant. Survivors that are known to change nothing stand in accepted.tsv (path, text before, text after,
+reason); any other makes the run fail, and so does a build that fails without an error of the compiler or the linker.
 """
 import argparse
 import csv
@@ -13,6 +13,7 @@ import os
 import pathlib
 import queue
 import random
+import re
 import shutil
 import subprocess
 import sys
@@ -27,13 +28,18 @@ TESTS = ("tests_spec", "tests_engine", "tests_provider", "tests_provider_start")
 TEST_SECONDS = 60
 
 
+class BuildFailure(Exception):
+    """The tools failed, not the code."""
+
+
 def run(command, folder, seconds=None):
+    """How the command ended (None where it took too long), and what it printed."""
     environment = dict(os.environ, CIMDELTA_ROOT=str(folder), CCACHE_BASEDIR=str(folder), CCACHE_NOHASHDIR="1")
     try:
         result = subprocess.run(command, cwd=folder, env=environment, timeout=seconds, stdout=subprocess.PIPE, stderr=subprocess.STDOUT)
     except subprocess.TimeoutExpired:
-        return False
-    return result.returncode == 0
+        return None, ""
+    return result.returncode, result.stdout.decode(errors="replace")
 
 
 class Workshop:
@@ -52,14 +58,21 @@ class Workshop:
                      "-DCMAKE_LINK_DEPENDS_NO_SHARED=ON"]
         if shutil.which("ccache"):
             configure.append("-DCMAKE_CXX_COMPILER_LAUNCHER=ccache")
-        if not run(configure, self.folder) or not self.build(os.cpu_count()) or not self.passes():
+        if run(configure, self.folder)[0] != 0 or not self.compiles(os.cpu_count()) or self.test() != "survived":
             sys.exit("mutate: the unchanged tree does not build or does not pass its tests")
 
-    def build(self, jobs=1):
-        return run(["ninja", "-C", "out", f"-j{jobs}", "delta", *TESTS], self.folder)
+    def compiles(self, jobs=1):
+        status, output = run(["ninja", "-C", "out", f"-j{jobs}", "delta", *TESTS], self.folder)
+        if status != 0 and not re.search(r"error: |undefined reference", output):
+            raise BuildFailure(output)
+        return status == 0
 
-    def passes(self):
-        return all(run([f"out/bin/{test}", "--gtest_fail_fast", "--gtest_brief=1"], self.folder, TEST_SECONDS) for test in TESTS)
+    def test(self):
+        for test in TESTS:
+            status, _ = run([f"out/bin/{test}", "--gtest_fail_fast", "--gtest_brief=1"], self.folder, TEST_SECONDS)
+            if status != 0:
+                return "too long" if status is None else "killed"
+        return "survived"
 
     def verdict(self, mutant):
         path = self.folder / mutant.path
@@ -68,16 +81,14 @@ class Workshop:
         lines[mutant.line - 1] = mutant.after
         path.write_text("\n".join(lines))
         try:
-            if not self.build():
-                return "invalid"
-            return "survived" if self.passes() else "killed"
+            return self.test() if self.compiles() else "invalid"
         finally:
             path.write_text(original)
 
 
 def all_mutants(only):
     for folder in FOLDERS:
-        for path in sorted((ROOT / folder).glob("*.cpp")):
+        for path in sorted((ROOT / folder).glob("*.[ch]*")):
             name = str(path.relative_to(ROOT))
             if name.startswith(only):
                 yield from mutants_of(name, path.read_text())
@@ -110,6 +121,8 @@ def try_all(mutants, jobs):
         thread.start()
     for thread in threads:
         thread.join()
+    if len(results) != len(mutants):
+        sys.exit("mutate: a build failed for another reason than the change; see above")
     return results
 
 
@@ -132,9 +145,9 @@ def main():
     with open(options.report, "w", encoding="utf-8") as report:
         for mutant, verdict in results:
             report.write("\t".join([verdict, mutant.path, str(mutant.line), mutant.operator, mutant.before.strip(), mutant.after.strip()]) + "\n")
-    counts = {name: sum(1 for _, verdict in results if verdict == name) for name in ("killed", "survived", "invalid")}
+    counts = {name: sum(1 for _, verdict in results if verdict == name) for name in ("killed", "too long", "survived", "invalid")}
     unexplained = [mutant for mutant, verdict in results if verdict == "survived" and mutant.key() not in known]
-    print(f"{counts['killed']} killed, {counts['survived']} survived ({counts['survived'] - len(unexplained)} of them known to change nothing), "
+    print(f"{counts['killed']} killed, {counts['too long']} ran too long, {counts['survived']} survived ({counts['survived'] - len(unexplained)} of them known to change nothing), "
           f"{counts['invalid']} did not compile; {time.time() - started:.0f} s; report: {options.report}")
     for mutant in unexplained:
         print(f"SURVIVED {mutant.path}:{mutant.line} {mutant.operator}\n  - {mutant.before.strip()}\n  + {mutant.after.strip()}")

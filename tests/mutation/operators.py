@@ -82,12 +82,15 @@ OPERATORS = {
     "swapped arguments": swapped_arguments,
     "text": changed_texts,
 }
+# A declaration changed on its own does not compile; values do.
+HEADER_OPERATORS = ("number plus one", "status", "true to false", "false to true", "text")
 
 
 def is_code(line):
     stripped = line.strip()
-    ignored = ("//", "#", "/*", "*", "using ", "namespace ", "class ", "template", "}", "friend ", "static_assert")
-    return bool(stripped) and not stripped.startswith(ignored)
+    ignored = ("//", "#", "/*", "*", "using ", "namespace ", "class ", "template", "friend ", "static_assert")
+    is_end = stripped.startswith("}") and not stripped.startswith("} else")
+    return bool(stripped) and not is_end and not stripped.startswith(ignored)
 
 
 def mutants_of(path, text):
@@ -96,7 +99,8 @@ def mutants_of(path, text):
             continue
         code, comment, rest = line.partition("  //")
         seen = {code}
-        for name, operator in OPERATORS.items():
+        for name in HEADER_OPERATORS if path.endswith(".h") else OPERATORS:
+            operator = OPERATORS[name]
             for after in operator(code):
                 if after not in seen:
                     seen.add(after)
