@@ -63,7 +63,7 @@ class TInMemExtent {
 
     const TInMemClass& fClass;
     std::vector<boost::shared_ptr<TInMemInstance>> fInstances;  // null where one was removed
-    mutable THashIndex fIndex;  // by TInMemInstance::fKeyHash, also while it is stale
+    mutable THashIndex fIndex;                                  // by TInMemInstance::fKeyHash, also while it is stale
     mutable bool fIsStale = false;
     std::size_t fCount = 0;
     std::uint64_t fNextGenerated = 1;

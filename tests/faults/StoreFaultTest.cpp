@@ -22,9 +22,9 @@ const int kDisks = 40;
 boost::shared_ptr<ICIMNamespace> MakeDisks()
 {
     TNamespaceBuilder builder(MakeNamespace(EHost::kInmem, "root/cimv2"));
-    builder.Class("Disk", "",
-                  {TNamespaceBuilder::Key("Id"), TNamespaceBuilder::Property("Note"),
-                   TNamespaceBuilder::Property("Size", EType::kUint64)});
+    builder.Class(
+        "Disk", "",
+        {TNamespaceBuilder::Key("Id"), TNamespaceBuilder::Property("Note"), TNamespaceBuilder::Property("Size", EType::kUint64)});
     builder.Class("Ssd", "Disk", {TNamespaceBuilder::Property("Wear", EType::kUint8)});
     for (int number = 0; number < kDisks; ++number) {
         builder.Instance("Disk", {{"Id", std::to_string(number)}, {"Note", kLong}});
