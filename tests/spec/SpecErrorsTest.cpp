@@ -1,4 +1,5 @@
 #include <boost/smart_ptr/make_shared.hpp>
+#include <stdexcept>
 #include <typeinfo>
 
 #include "host/TZELException.h"
@@ -179,27 +180,41 @@ struct TSpecialException : TZELException {
     using TZELException::TZELException;
 };
 
-// A schema that has its class once, and then fails in its own way.
+// A schema that answers a number of times, and then throws in its own way.
+template <typename TFailure>
 class TFadingSchema : public TWatchedNamespace {
   public:
-    explicit TFadingSchema(boost::shared_ptr<ICIMNamespace> ns) : TWatchedNamespace(ns, boost::make_shared<TCallWatch>(), "fading")
+    TFadingSchema(boost::shared_ptr<ICIMNamespace> ns, int answers, const TFailure& failure)
+        : TWatchedNamespace(ns, boost::make_shared<TCallWatch>(), "fading"), fAnswers(answers), fFailure(failure)
     {}
 
     boost::shared_ptr<ICIMClass> GetClass(const std::string& name, TCallContext context) override
     {
-        if (++fTimes > 1) {
-            throw TSpecialException(TZELStatusCode::kNamespaceGone);
+        if (--fAnswers < 0) {
+            throw fFailure;
         }
         return TWatchedNamespace::GetClass(name, context);
     }
 
   private:
-    int fTimes = 0;
+    int fAnswers;
+    TFailure fFailure;
 };
 
-TEST_F(SpecErrorsTest, AFailureOfTheSchemaIsThrownAnew)
+class FadingSchemaTest : public SpecErrorsTest {
+  protected:
+    // From here on the schema is there for that many classes only.
+    template <typename TFailure>
+    void FadeAfter(int answers, const TFailure& failure)
+    {
+        fNamespaces[0] = boost::make_shared<TFadingSchema<TFailure>>(fComparison.Namespace(0).GetNamespace(), answers, failure);
+    }
+};
+
+TEST_F(FadingSchemaTest, AFailureIsThrownAnew)
 {
-    TCIMDiffEngine::TDiffXMLParser parser(boost::make_shared<TFadingSchema>(fComparison.Namespace(0).GetNamespace()));
+    FadeAfter(1, TSpecialException(TZELStatusCode::kNamespaceGone));
+    TCIMDiffEngine::TDiffXMLParser parser(fNamespaces[0]);
     std::map<std::string, std::string> attrs;
     parser.StartElement("DifftoolSpec", attrs);
     attrs["name"] = "Other";
@@ -211,6 +226,20 @@ TEST_F(SpecErrorsTest, AFailureOfTheSchemaIsThrownAnew)
         EXPECT_EQ(TZELStatusCode::kNamespaceGone, error.GetStatusCode().GetStatus());
         EXPECT_EQ(typeid(TZELException), typeid(error));
     }
+}
+
+TEST_F(FadingSchemaTest, WhatIsNoExceptionOfTheHostPassesWithoutAWordInTheLog)
+{
+    const std::string document = InValue("A");
+    for (const int answers : {0, 1, 2}) {  // in the start tag of the class, the end tag of the value, the end tag of the class
+        FadeAfter(answers, std::runtime_error("own"));
+        EXPECT_THROW(Read(document), std::runtime_error) << answers;
+        FadeAfter(answers, 5);
+        EXPECT_THROW(Read(document), int) << answers;
+        EXPECT_EQ("", TakeLog()) << answers;
+    }
+    FadeAfter(3, 5);
+    EXPECT_EQ("Other exclude A:INCLUDE\n", Read(document));
 }
 
 TEST_F(SpecErrorsTest, AFailureOfThePushDownKeepsItsStatus)
