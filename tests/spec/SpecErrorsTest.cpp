@@ -103,14 +103,22 @@ const std::vector<TBadSpec> kBadLists = {
     {InValue("Z"), 4, "Invalid property \"Z\" specified on line #\n", EEvent::kEnd},
     {InValue(""), 4, "Invalid property \"\" specified on line #\n", EEvent::kEnd},
     {InValue(" A "), 4, "Invalid property \" A \" specified on line #\n", EEvent::kEnd},
-    {InValue("a"), 4, "Invalid property \"a\" specified on line #\n", EEvent::kEnd},
     {InValue("\nA"), 5, "Invalid property \"\nA\" specified on line #\n", EEvent::kEnd},
     {InClass("<excludelist>\n<value>Z</value>\n</excludelist>"), 4, "Invalid property \"Z\" specified on line #\n", EEvent::kEnd},
     {InValue("Z<x/>"), 4, "Invalid property \"Z\" specified on line #\n", EEvent::kEnd},
 };
 
-class SpecErrorsTest : public TSpecFixture {
+// Names in another letter case than the schema's; whether it knows them is the host's business.
+const std::vector<TBadSpec> kOtherCase = {
+    {"<DifftoolSpec>\n<class name=\"other\"/>\n</DifftoolSpec>", 2, kNoClass},
+    {"<DifftoolSpec>\n<class name=\"OTHER\"/>\n</DifftoolSpec>", 2, kNoClass},
+    {InValue("a"), 4, "Invalid property \"a\" specified on line #\n", EEvent::kEnd},
+};
+
+class SpecErrorsTest : public TSpecFixture, public testing::WithParamInterface<EHost> {
   protected:
+    SpecErrorsTest() : TSpecFixture(GetParam()) {}
+
     void ExpectBothEntries(const std::vector<TBadSpec>& table)
     {
         for (const auto& bad : table) {
@@ -120,22 +128,54 @@ class SpecErrorsTest : public TSpecFixture {
     }
 };
 
-TEST_F(SpecErrorsTest, WrongRootsAreLoggedTwiceWithTheirLine)
+INSTANTIATE_TEST_SUITE_P(Hosts, SpecErrorsTest, testing::Values(EHost::kPlain, EHost::kInmem), testing::PrintToStringParamName());
+
+TEST_P(SpecErrorsTest, WrongRootsAreLoggedTwiceWithTheirLine)
 {
     ExpectBothEntries(kBadRoots);
 }
 
-TEST_F(SpecErrorsTest, WrongClassesAreLoggedTwiceWithTheirLine)
+TEST_P(SpecErrorsTest, WrongClassesAreLoggedTwiceWithTheirLine)
 {
     ExpectBothEntries(kBadClasses);
 }
 
-TEST_F(SpecErrorsTest, WrongListsAreLoggedTwiceWithTheirLine)
+TEST_P(SpecErrorsTest, WrongListsAreLoggedTwiceWithTheirLine)
 {
     ExpectBothEntries(kBadLists);
 }
 
-TEST_F(SpecErrorsTest, TheFullTextOfAnErrorOnLineTwelve)
+class ExactNamesTest : public SpecErrorsTest {};
+
+INSTANTIATE_TEST_SUITE_P(Hosts, ExactNamesTest, testing::Values(EHost::kPlain), testing::PrintToStringParamName());
+
+TEST_P(ExactNamesTest, NamesInAnotherLetterCaseAreUnknown)
+{
+    ExpectBothEntries(kOtherCase);
+}
+
+class TolerantHostTest : public SpecErrorsTest {};
+
+INSTANTIATE_TEST_SUITE_P(Hosts, TolerantHostTest, testing::Values(EHost::kInmem), testing::PrintToStringParamName());
+
+TEST_P(TolerantHostTest, NamesInAnotherLetterCaseAreKeptAsTheFileSpellsThem)
+{
+    EXPECT_EQ("Other exclude a:INCLUDE\n", Read(InValue("a")));
+    EXPECT_EQ("Sub include A:EXCLUDE\n"
+              "base include A:EXCLUDE\n",
+              Read("<DifftoolSpec><class name=\"base\" default=\"include\"><excludelist><value>A</value></excludelist></class>"
+                   "</DifftoolSpec>"));
+    EXPECT_EQ("", TakeLog());
+}
+
+TEST_P(TolerantHostTest, TwoSpellingsOfAClassAreTwoEntries)
+{
+    EXPECT_EQ("Other exclude\n"
+              "other include\n",
+              Read("<DifftoolSpec><class name=\"Other\"/><class name=\"other\" default=\"include\"/></DifftoolSpec>"));
+}
+
+TEST_P(SpecErrorsTest, TheFullTextOfAnErrorOnLineTwelve)
 {
     std::string document = "<DifftoolSpec>\n";
     document.append(10, '\n');
@@ -148,28 +188,28 @@ TEST_F(SpecErrorsTest, TheFullTextOfAnErrorOnLineTwelve)
     EXPECT_EQ(std::string::npos, log.find("Previous error"));
 }
 
-TEST_F(SpecErrorsTest, AnotherFailureOfTheClassLookUpKeepsItsStatus)
+TEST_P(SpecErrorsTest, AnotherFailureOfTheClassLookUpKeepsItsStatus)
 {
     fComparison.GetWatch().FailCallsOf("ns0.GetClass(\"Other\")", TZELStatusCode::kNamespaceGone);
     EXPECT_EQ("status 18", Read("<DifftoolSpec>\n<class name=\"Other\"/></DifftoolSpec>"));
     EXPECT_EQ(BarrierEntry(EEvent::kStart, TZELStatusCode::kNamespaceGone, 2), TakeLog());
 }
 
-TEST_F(SpecErrorsTest, AnotherFailureOfThePropertyLookUpKeepsItsStatus)
+TEST_P(SpecErrorsTest, AnotherFailureOfThePropertyLookUpKeepsItsStatus)
 {
     fComparison.GetWatch().FailCallsOf("ns0:Other.GetPropertyDecl(\"A\")", TZELStatusCode::kTypeMismatch);
     EXPECT_EQ("status 13", Read(InValue("A")));
     EXPECT_EQ(BarrierEntry(EEvent::kEnd, TZELStatusCode::kTypeMismatch, 4), TakeLog());
 }
 
-TEST_F(SpecErrorsTest, AClassThatIsGoneWhenItsPropertyIsLookedUpMakesThePropertyInvalid)
+TEST_P(SpecErrorsTest, AClassThatIsGoneWhenItsPropertyIsLookedUpMakesThePropertyInvalid)
 {
     fComparison.GetWatch().FailCall(2, TZELStatusCode::kNotFound);
     EXPECT_EQ("status 9", Read(InValue("A")));
     EXPECT_EQ(BothEntries({InValue("A"), 4, "Invalid property \"A\" specified on line #\n", EEvent::kEnd}), TakeLog());
 }
 
-TEST_F(SpecErrorsTest, AnotherFailureOfThePropertysClassLookUpKeepsItsStatus)
+TEST_P(SpecErrorsTest, AnotherFailureOfThePropertysClassLookUpKeepsItsStatus)
 {
     fComparison.GetWatch().FailCall(2, TZELStatusCode::kNamespaceGone);
     EXPECT_EQ("status 18", Read(InValue("A")));
@@ -211,7 +251,9 @@ class FadingSchemaTest : public SpecErrorsTest {
     }
 };
 
-TEST_F(FadingSchemaTest, AFailureIsThrownAnew)
+INSTANTIATE_TEST_SUITE_P(Hosts, FadingSchemaTest, testing::Values(EHost::kPlain, EHost::kInmem), testing::PrintToStringParamName());
+
+TEST_P(FadingSchemaTest, AFailureIsThrownAnew)
 {
     FadeAfter(1, TSpecialException(TZELStatusCode::kNamespaceGone));
     TCIMDiffEngine::TDiffXMLParser parser(fNamespaces[0]);
@@ -228,7 +270,7 @@ TEST_F(FadingSchemaTest, AFailureIsThrownAnew)
     }
 }
 
-TEST_F(FadingSchemaTest, WhatIsNoExceptionOfTheHostPassesWithoutAWordInTheLog)
+TEST_P(FadingSchemaTest, WhatIsNoExceptionOfTheHostPassesWithoutAWordInTheLog)
 {
     const std::string document = InValue("A");
     for (const int answers : {0, 1, 2}) {  // in the start tag of the class, the end tag of the value, the end tag of the class
@@ -242,14 +284,14 @@ TEST_F(FadingSchemaTest, WhatIsNoExceptionOfTheHostPassesWithoutAWordInTheLog)
     EXPECT_EQ("Other exclude A:INCLUDE\n", Read(document));
 }
 
-TEST_F(SpecErrorsTest, AFailureOfThePushDownKeepsItsStatus)
+TEST_P(SpecErrorsTest, AFailureOfThePushDownKeepsItsStatus)
 {
     fComparison.GetWatch().FailCallsOf("ns0:Other.EnumerateSubClasses", TZELStatusCode::kNotFound);
     EXPECT_EQ("status 15", Read("<DifftoolSpec>\n<class name=\"Other\">\n</class></DifftoolSpec>"));
     EXPECT_EQ(BarrierEntry(EEvent::kEnd, TZELStatusCode::kNotFound, 3), TakeLog());
 }
 
-TEST_F(SpecErrorsTest, MalformedXmlIsLoggedOnceWithTheHostsMessage)
+TEST_P(SpecErrorsTest, MalformedXmlIsLoggedOnceWithTheHostsMessage)
 {
     EXPECT_EQ("status 9", Read("<DifftoolSpec>\n<class name=\"Other\"></DifftoolSpec>"));
     EXPECT_EQ("0|Diff-XML Parser line 2:mismatched tag|", TakeLog());
@@ -257,7 +299,7 @@ TEST_F(SpecErrorsTest, MalformedXmlIsLoggedOnceWithTheHostsMessage)
     EXPECT_EQ("0|Diff-XML Parser line 3:no element found|", TakeLog());
 }
 
-TEST_F(SpecErrorsTest, FatalErrorLogsItsMessageAndThrows)
+TEST_P(SpecErrorsTest, FatalErrorLogsItsMessageAndThrows)
 {
     TCIMDiffEngine::TDiffXMLParser parser(fNamespaces[0]);
     try {
@@ -269,7 +311,7 @@ TEST_F(SpecErrorsTest, FatalErrorLogsItsMessageAndThrows)
     EXPECT_EQ("0|Diff-XML Parser line " + std::to_string(parser.GetCurLine()) + ":a message|", TakeLog());
 }
 
-TEST_F(SpecErrorsTest, NothingOfABadDocumentIsLeftBehind)
+TEST_P(SpecErrorsTest, NothingOfABadDocumentIsLeftBehind)
 {
     EXPECT_EQ("status 9", Read("<DifftoolSpec><class name=\"Base\"/><class/></DifftoolSpec>"));
     EXPECT_EQ("Other exclude\n", Read("<DifftoolSpec><class name=\"Other\"/></DifftoolSpec>"));
