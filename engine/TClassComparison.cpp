@@ -168,15 +168,15 @@ void TCIMDiffEngine::TClassComparison::RecordMissingInstances()
     for (const auto& [key, indices] : fMissing) {
         fEngine.createCIMDiff(fClassRecord, TDeltaNamespace::kInstanceAdded, key, "", indices);
         if (HasTwoNamespaces()) {
-            CopyToReference(*others[key].instance);
+            CopyToReference(others[key].instance);
         }
     }
 }
 
-void TCIMDiffEngine::TClassComparison::CopyToReference(const ICIMInstance& instance)
+void TCIMDiffEngine::TClassComparison::CopyToReference(boost::shared_ptr<ICIMInstance> instance)
 {
     const boost::shared_ptr<ICIMInstance> copy = fClass->AllocateInstance(TCallContext());
-    for (const boost::shared_ptr<ICIMProperty>& property : GetProperties(instance)) {
+    for (const boost::shared_ptr<ICIMProperty>& property : GetProperties(*instance)) {
         const TCIMValue& value = property->GetValue(TCallContext());
         if (!value.IsNull()) {
             const boost::shared_ptr<const ICIMPropertyDecl> decl = property->GetPropertyDecl(TCallContext());

@@ -27,7 +27,7 @@ class TCIMDiffEngine::TClassComparison {
     void RecordAbsentInstance(const std::string& key, const TIndices& indices, bool excludesKeys);
     void RecordMissingInstances();
     void RecordDifferences();
-    void CopyToReference(const ICIMInstance& instance);
+    void CopyToReference(boost::shared_ptr<ICIMInstance> instance);
     bool HasTwoNamespaces() const;
 
     TCIMDiffEngine& fEngine;
