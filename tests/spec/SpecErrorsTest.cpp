@@ -2,6 +2,7 @@
 #include <stdexcept>
 #include <typeinfo>
 
+#include "embedded/TAssertionFailure.h"
 #include "host/TZELException.h"
 #include "spec/TDiffXMLParser.h"
 #include "tests/spec/TSpecFixture.h"
@@ -282,6 +283,41 @@ TEST_P(FadingSchemaTest, WhatIsNoExceptionOfTheHostPassesWithoutAWordInTheLog)
     }
     FadeAfter(3, 5);
     EXPECT_EQ("Other exclude A:INCLUDE\n", Read(document));
+}
+
+// A schema that answers a number of times, and then with a null class.
+class TEmptyingSchema : public TWatchedNamespace {
+  public:
+    TEmptyingSchema(boost::shared_ptr<ICIMNamespace> ns, int answers)
+        : TWatchedNamespace(ns, boost::make_shared<TCallWatch>(), "emptying"), fAnswers(answers)
+    {}
+
+    boost::shared_ptr<ICIMClass> GetClass(const std::string& name, TCallContext context) override
+    {
+        return --fAnswers < 0 ? nullptr : TWatchedNamespace::GetClass(name, context);
+    }
+
+  private:
+    int fAnswers;
+};
+
+TEST_P(SpecErrorsTest, ANullSchemaFailsTheAssertionAtTheFirstClass)
+{
+    fNamespaces[0] = nullptr;
+    EXPECT_EQ("", Read("<DifftoolSpec/>"));
+    EXPECT_THROW(Read("<DifftoolSpec><class name=\"Other\"/></DifftoolSpec>"), TAssertionFailure);
+    EXPECT_EQ(0u, TakeLog().find("0|Assertion failed: px != 0"));
+}
+
+TEST_P(SpecErrorsTest, ANullClassFailsTheAssertionWhereItIsAskedForMore)
+{
+    for (const int answers : {0, 1, 2}) {  // a class element asks for no more than its class
+        fNamespaces[0] = boost::make_shared<TEmptyingSchema>(fComparison.Namespace(0).GetNamespace(), answers);
+        EXPECT_THROW(Read(InValue("A")), TAssertionFailure) << answers;
+        const std::string log = TakeLog();
+        EXPECT_EQ(0u, log.find("0|Assertion failed: px != 0")) << answers;
+        EXPECT_EQ(std::string::npos, log.find("exception in")) << answers;
+    }
 }
 
 TEST_P(SpecErrorsTest, AFailureOfThePushDownKeepsItsStatus)
