@@ -137,6 +137,14 @@ TEST_P(ConstructionTest, WithoutAnyNamespaceTheCheckFails)
     EXPECT_EQ(kCheckFailed, fLog.Take());
 }
 
+TEST_P(ConstructionTest, WithTheMarkerTheLackOfANamespaceIsFoundWhereOneIsNeeded)
+{
+    TEngine engine(fComparison.GetDelta(), fNamespaces, "|fVMWareEnable");
+    EXPECT_THROW(engine.compare(), std::out_of_range);
+    EXPECT_THROW(engine.ReadSpecFile(fComparison.GetRulesPath()), std::out_of_range);
+    EXPECT_EQ("", fLog.Take());
+}
+
 TEST_P(ConstructionTest, AMissingPropertyFailsTheCheck)
 {
     fComparison.SetWithOperatingSystem(false);
