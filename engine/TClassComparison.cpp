@@ -61,11 +61,12 @@ void TCIMDiffEngine::TClassComparison::Run()
     for (std::size_t index = 1; index < fEngine.namespaces.size(); ++index) {
         CompareWithNamespace(index);
     }
+    const bool excludesKeys = fRules->hasExcludedKeys();
     if (!IsAnythingDifferent()) {
         return;
     }
     CreateClassRecord();
-    RecordAbsentInstances();
+    RecordAbsentInstances(excludesKeys);
     RecordMissingInstances();
     RecordDifferences();
 }
@@ -135,9 +136,8 @@ void TCIMDiffEngine::TClassComparison::CreateClassRecord()
     fClassRecord->AddToNamespace(TCallContext());
 }
 
-void TCIMDiffEngine::TClassComparison::RecordAbsentInstances()
+void TCIMDiffEngine::TClassComparison::RecordAbsentInstances(bool excludesKeys)
 {
-    const bool excludesKeys = fRules->hasExcludedKeys();
     for (const auto& [key, indices] : fAbsent) {
         RecordAbsentInstance(key, indices, excludesKeys);
         if (HasTwoNamespaces()) {
