@@ -69,11 +69,13 @@ class TCIMDiffEngine {
     /// With exactly one namespace, or where the file name contains "|fVMWareEnable", neither happens and there are no rules.
     /// `namespaces` is kept by reference and must outlive the engine. Each namespace must hold KALMO_OperatingSystem, and the
     /// reference an instance of it with a numeric OSType; the values of the others do not matter.
-    /// Errors: status 3 where that is not so, whatever the cause, after one entry in the core log; those of ReadSpecFile.
+    /// Errors: status 3 where that is not so, whatever the cause and without any namespace too, after one entry in the core log,
+    /// or two where the reference's OSType changes meanwhile; those of ReadSpecFile.
     TCIMDiffEngine(boost::shared_ptr<ICIMNamespace> deltaNamespace, std::vector<boost::shared_ptr<ICIMNamespace>>& namespaces,
                    std::string specFileName);
 
-    /// Compares every class of the reference, parents before children. Errors: as compare(cls).
+    /// Compares every class of the reference, parents before children. Errors: as compare(cls); std::out_of_range without any
+    /// namespace.
     void compare();
 
     /// Compares the instances of one class of the reference, and of all classes below it.
@@ -116,9 +118,10 @@ class TCIMDiffEngine {
 
     /// Reads a specification file of at most 104,857,600 bytes, validated against the first namespace.
     ///
-    /// Errors: status 9 where the file is larger (before it is opened) or wrong, with two entries in the core log for what is
-    /// wrong; 4 without memory for it; 11 where it cannot be opened or read (a file whose reading failed stays open); any
-    /// other status of the schema or of the host's file size.
+    /// Errors: status 9 where the file is larger (before it is opened) or wrong, with two entries in the core log for what the
+    /// grammar or the schema does not know and one for malformed XML; 4 without memory for it; 11 where it cannot be opened or
+    /// read (a file whose reading failed stays open); any other status of the schema, with one entry, or of the host's file
+    /// size; std::out_of_range without any namespace.
     TRuleset ReadSpecFile(const std::string& fileName);
 
   private:

@@ -61,11 +61,12 @@ void TCIMDiffEngine::TClassComparison::Run()
     for (std::size_t index = 1; index < fEngine.namespaces.size(); ++index) {
         CompareWithNamespace(index);
     }
+    const bool excludesKeys = fRules->hasExcludedKeys();
     if (!IsAnythingDifferent()) {
         return;
     }
     CreateClassRecord();
-    RecordAbsentInstances();
+    RecordAbsentInstances(excludesKeys);
     RecordMissingInstances();
     RecordDifferences();
 }
@@ -135,9 +136,8 @@ void TCIMDiffEngine::TClassComparison::CreateClassRecord()
     fClassRecord->AddToNamespace(TCallContext());
 }
 
-void TCIMDiffEngine::TClassComparison::RecordAbsentInstances()
+void TCIMDiffEngine::TClassComparison::RecordAbsentInstances(bool excludesKeys)
 {
-    const bool excludesKeys = fRules->hasExcludedKeys();
     for (const auto& [key, indices] : fAbsent) {
         RecordAbsentInstance(key, indices, excludesKeys);
         if (HasTwoNamespaces()) {
@@ -168,15 +168,15 @@ void TCIMDiffEngine::TClassComparison::RecordMissingInstances()
     for (const auto& [key, indices] : fMissing) {
         fEngine.createCIMDiff(fClassRecord, TDeltaNamespace::kInstanceAdded, key, "", indices);
         if (HasTwoNamespaces()) {
-            CopyToReference(*others[key].instance);
+            CopyToReference(others[key].instance);
         }
     }
 }
 
-void TCIMDiffEngine::TClassComparison::CopyToReference(const ICIMInstance& instance)
+void TCIMDiffEngine::TClassComparison::CopyToReference(boost::shared_ptr<ICIMInstance> instance)
 {
     const boost::shared_ptr<ICIMInstance> copy = fClass->AllocateInstance(TCallContext());
-    for (const boost::shared_ptr<ICIMProperty>& property : GetProperties(instance)) {
+    for (const boost::shared_ptr<ICIMProperty>& property : GetProperties(*instance)) {
         const TCIMValue& value = property->GetValue(TCallContext());
         if (!value.IsNull()) {
             const boost::shared_ptr<const ICIMPropertyDecl> decl = property->GetPropertyDecl(TCallContext());

@@ -23,11 +23,11 @@ class TCIMDiffEngine::TClassComparison {
     void NoteAbsentInstances(std::size_t index);
     bool IsAnythingDifferent() const;
     void CreateClassRecord();
-    void RecordAbsentInstances();
+    void RecordAbsentInstances(bool excludesKeys);
     void RecordAbsentInstance(const std::string& key, const TIndices& indices, bool excludesKeys);
     void RecordMissingInstances();
     void RecordDifferences();
-    void CopyToReference(const ICIMInstance& instance);
+    void CopyToReference(boost::shared_ptr<ICIMInstance> instance);
     bool HasTwoNamespaces() const;
 
     TCIMDiffEngine& fEngine;

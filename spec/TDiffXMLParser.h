@@ -20,8 +20,9 @@ namespace NORVZEL20 {
 ///
 /// A stack holds one state for each open element, above TStateStart for the document itself. The state on top takes the next
 /// tag: a start tag that it accepts pushes a state, an end tag pops one. End tags are not compared with what is open. Each class
-/// and property is validated against a schema as it is read. The first error ends the parse: it is logged twice, once with the
-/// detail and once with the line, and thrown as TZELException.
+/// and property is validated against a schema as it is read. The first error ends the parse and is thrown as TZELException. What
+/// the grammar or the schema does not know is logged twice, once with the detail and once with the tag's line; malformed XML and
+/// any other failure of the schema once. Exceptions of other types pass through unlogged.
 ///
 /// For one document; one thread.
 class TCIMDiffEngine::TDiffXMLParser : public TXmlParser {
@@ -38,7 +39,8 @@ class TCIMDiffEngine::TDiffXMLParser : public TXmlParser {
     explicit TDiffXMLParser(boost::shared_ptr<ICIMNamespace> schema);
     ~TDiffXMLParser() override;
 
-    /// Hands the tag to the state on top. Errors: status 9 for what the grammar does not know, any other status of the schema.
+    /// Hands the tag to the state on top. Errors: status 9 for what the grammar or the schema does not know, any other status of
+    /// the schema; each logged with the line.
     void StartElement(const char* name, std::map<std::string, std::string>& attrs) override;
     void EndElement(const char* name) override;
     /// Ignored.

@@ -1,13 +1,12 @@
 #include <boost/smart_ptr/make_shared.hpp>
-#include <functional>
 #include <stdexcept>
 
+#include "tests/engine/TAnsweringNamespace.h"
 #include "tests/engine/TEngineFixture.h"
 #include "tests/support/Dump.h"
 #include "tests/support/TTestAccess.h"
 #include "tests/support/TWatchedClass.h"
 #include "tests/support/TWatchedInstance.h"
-#include "tests/support/TWatchedNamespace.h"
 
 namespace NORVZEL20 {
 namespace {
@@ -138,6 +137,14 @@ TEST_P(ConstructionTest, WithoutAnyNamespaceTheCheckFails)
     EXPECT_EQ(kCheckFailed, fLog.Take());
 }
 
+TEST_P(ConstructionTest, WithTheMarkerTheLackOfANamespaceIsFoundWhereOneIsNeeded)
+{
+    TEngine engine(fComparison.GetDelta(), fNamespaces, "|fVMWareEnable");
+    EXPECT_THROW(engine.compare(), std::out_of_range);
+    EXPECT_THROW(engine.ReadSpecFile(fComparison.GetRulesPath()), std::out_of_range);
+    EXPECT_EQ("", fLog.Take());
+}
+
 TEST_P(ConstructionTest, AMissingPropertyFailsTheCheck)
 {
     fComparison.SetWithOperatingSystem(false);
@@ -217,27 +224,13 @@ class TDriftingClass : public TWatchedClass {
     unsigned short* fNumber;
 };
 
-// A namespace that answers for its classes as a test says.
-class TOddNamespace : public TWatchedNamespace {
-  public:
-    using TAnswer = std::function<boost::shared_ptr<ICIMClass>(const std::string&)>;
-
-    TOddNamespace(boost::shared_ptr<ICIMNamespace> ns, TAnswer answer)
-        : TWatchedNamespace(ns, boost::make_shared<TCallWatch>(), "odd"), fAnswer(answer)
-    {}
-
-    boost::shared_ptr<ICIMClass> GetClass(const std::string& name, TCallContext) override { return fAnswer(name); }
-
-  private:
-    TAnswer fAnswer;
-};
-
 class OddReferenceTest : public ConstructionTest {
   protected:
-    std::string ConstructWith(TOddNamespace::TAnswer answer)
+    std::string ConstructWith(TAnsweringNamespace::TAnswer answer)
     {
         fComparison.SetNamespaceCount(2);
-        fNamespaces = {boost::make_shared<TOddNamespace>(fComparison.Namespace(0).GetNamespace(), answer), fComparison.Watched(1)};
+        fNamespaces = {boost::make_shared<TAnsweringNamespace>(fComparison.Namespace(0).GetNamespace(), answer),
+                       fComparison.Watched(1)};
         return OutcomeOf([&] { TEngine(fComparison.GetDelta(), fNamespaces, fComparison.GetRulesPath()); });
     }
 };

@@ -157,6 +157,15 @@ TEST_F(InstanceComparisonTest, AReferenceAgainstAnotherTypeIsAnErrorOfTheHost)
     EXPECT_EQ("status 13", OutcomeOf([&] { Compare("Owner", PathTo("", 1, "a"), TCIMValue("text")); }));
 }
 
+TEST_F(InstanceComparisonTest, AnotherTypeAgainstAReferenceDiffers)
+{
+    EXPECT_EQ("k Owner 1\n", Compare("Owner", TCIMValue("text"), PathTo("", 1, "a")));
+    EXPECT_EQ("k Owner 1\n", Compare("Owner", TCIMValue("Disk.Bus=1,Id=\"a\""), PathTo("", 1, "a")));
+    EXPECT_EQ("k Owner 1\n", Compare("Owner", TCIMValue(), PathTo("", 1, "a")));
+    fRules = RulesWithout("Bus");
+    EXPECT_EQ("k Owner 1\n", Compare("Owner", TCIMValue("text"), PathTo("", 1, "a")));
+}
+
 TEST_F(InstanceComparisonTest, BothPathsAreKeptAsAliasesWhereKeysAreExcluded)
 {
     fRules = RulesWithout("Bus");

@@ -1,7 +1,10 @@
+#include <algorithm>
 #include <boost/smart_ptr/make_shared.hpp>
+#include <list>
 
 #include "embedded/TAssertionFailure.h"
 #include "tests/engine/TEngineFixture.h"
+#include "tests/support/TWatchedClass.h"
 #include "tests/support/TWatchedInstance.h"
 
 namespace NORVZEL20 {
@@ -107,6 +110,50 @@ TEST_P(KeysTest, AKeyPropertyThatIsNullFailsTheAssertion)
     EXPECT_THROW(Engine().buildPath(RulesWithout("Bus"), bare), TAssertionFailure);
     EXPECT_NE(std::string::npos, fLog.Take().find("px != 0"));
     EXPECT_EQ("Disk", Engine().buildPath(RulesWithout("Bus Id"), bare));
+}
+
+using TNames = std::list<std::string>;
+
+// A class whose key names are good for as long as it lives.
+class TPassingClass : public TWatchedClass {
+  public:
+    TPassingClass(boost::shared_ptr<ICIMClass> cls, boost::shared_ptr<TNames> names)
+        : TWatchedClass(cls, boost::make_shared<TCallWatch>(), "passing"), fNames(names)
+    {}
+    ~TPassingClass() override { std::fill(fNames->begin(), fNames->end(), "gone"); }
+
+    void EnumerateKeyNames(const boost::function<bool(const std::string*)>& callback, TCallContext context) const override
+    {
+        const auto keepAndPassOn = [&](const std::string* name) { return callback(&fNames->emplace_back(*name)); };
+        GetWatched()->EnumerateKeyNames(keepAndPassOn, context);
+    }
+
+  private:
+    boost::shared_ptr<TNames> fNames;
+};
+
+// An instance that makes a class for each one who asks, and keeps none.
+class TInstanceOfPassingClass : public TWatchedInstance {
+  public:
+    explicit TInstanceOfPassingClass(boost::shared_ptr<ICIMInstance> instance)
+        : TWatchedInstance(instance, boost::make_shared<TCallWatch>(), "passing", "passing")
+    {}
+
+    boost::shared_ptr<ICIMClass> GetClass(TCallContext context) const override
+    {
+        fNames.push_back(boost::make_shared<TNames>());
+        return boost::make_shared<TPassingClass>(GetWatched()->GetClass(context), fNames.back());
+    }
+
+  private:
+    mutable std::vector<boost::shared_ptr<TNames>> fNames;  // kept, so that a name read too late is seen to be gone
+};
+
+TEST_P(KeysTest, TheClassIsHeldUntilItsKeyNamesAreRead)
+{
+    const auto disk = boost::make_shared<TInstanceOfPassingClass>(Disk(0, {{"Id", "sda"}, {"Bus", 1u}}));
+    EXPECT_EQ("Disk.Bus=1,Id=\"sda\"", Engine().buildPath(RulesWithout(""), disk));
+    EXPECT_EQ("Disk.Id=\"sda\"", Engine().buildPath(RulesWithout("Bus"), disk));
 }
 
 TEST_P(KeysTest, NullRulesFailTheAssertion)

@@ -184,6 +184,25 @@ TEST_P(ExcludedKeysTest, SeveralInstancesOfOneKeyCountSeveralTimes)
               RecordsAfterRun());
 }
 
+TEST_P(ExcludedKeysTest, ARunWritesNothingToStandardOutput)
+{
+    Disk(0, "sda", 1, 3);
+    Disk(0, "sdb", 1, 3);
+    Disk(1, "sdb", 2, 4);
+    Disk(1, "sdc", 1, 4);
+    testing::internal::CaptureStdout();
+    const std::string records = RecordsAfterRun();
+    Rules("<class/>");
+    const std::string status = fComparison.Run();
+    EXPECT_EQ("", testing::internal::GetCapturedStdout());
+    EXPECT_EQ("Disk\n"
+              "  1 root/cimv2:Disk.Bus=3,Id=\"sda\" [1]\n"
+              "  2 Disk.Id=\"sdc\" [1]\n"
+              "  4 Disk.Id=\"sdb\" Size [1]\n",
+              records);
+    EXPECT_EQ("status 9\n", status);
+}
+
 // What a store with checks refuses: instances with the same keys.
 class SameKeysTest : public TPerClassFixture {
   protected:

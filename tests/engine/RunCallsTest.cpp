@@ -129,6 +129,25 @@ std::string Record(int type, const std::string& instance, const std::string& pro
                        "Delta.SetValue(root/cimv2:KALMO_Delta.DeltaID=" + std::to_string(number) + ") {}", "AddToNamespace() {}"});
 }
 
+// What follows the record of an instance that the other one of two namespaces lacks.
+std::string Marked(const std::string& id)
+{
+    return Calls("ns0:Disk.Id=\"" + id + "\"",
+                 {"EnumerateProperties() {}", "Id.GetValue() {}", "Id.MarkRemoved()", "Size.GetValue() {}", "Size.MarkRemoved()"});
+}
+
+// What follows the record of an instance that only the other one of two namespaces has.
+std::string Copied(const std::string& id, unsigned int size)
+{
+    const std::string disk = "ns1:Disk.Id=\"" + id + "\"";
+    return "ns0:Disk.AllocateInstance() {}\n" +
+           Calls(disk, {"EnumerateProperties() {}", "Id.GetValue() {}", "Id.GetPropertyDecl() {}", "Id.Decl.GetName() {}"}) +
+           Calls("ns0:new Disk", {"GetProperty(\"Id\") {}", "Id.SetValue(\"" + id + "\") {}"}) +
+           Calls(disk, {"Size.GetValue() {}", "Size.GetPropertyDecl() {}", "Size.Decl.GetName() {}"}) +
+           Calls("ns0:new Disk",
+                 {"GetProperty(\"Size\") {}", "Size.SetValue(" + std::to_string(size) + ") {}", "AddToNamespace() {}"});
+}
+
 TEST_P(RunCallsTest, OfTwoNamespaces)
 {
     Disk(0, "sda", 100);
@@ -142,19 +161,56 @@ TEST_P(RunCallsTest, OfTwoNamespaces)
                   "ns1:Disk.EnumerateInstances(false) {}\n" +
                   Key("ns1", "sda") + Read("sda", "ns1", "Id") + Read("sda", "ns1", "Size") +
                   "ns0:Disk.Id=\"sda\".Size.MarkChanged(200)\n" +  //
-                  Key("ns1", "sdc") + kClassRecord + Record(1, "Disk.Id=\"sdb\"", "", "1", 1) +
-                  Calls("ns0:Disk.Id=\"sdb\"", {"EnumerateProperties() {}", "Id.GetValue() {}", "Id.MarkRemoved()",
-                                                "Size.GetValue() {}", "Size.MarkRemoved()"}) +
+                  Key("ns1", "sdc") + kClassRecord + Record(1, "Disk.Id=\"sdb\"", "", "1", 1) + Marked("sdb") +
                   "ns1:Disk.EnumerateInstances(false) {}\n" + Key("ns1", "sda") + Key("ns1", "sdc") +
-                  Record(2, "Disk.Id=\"sdc\"", "", "1", 2) +
-                  "ns0:Disk.AllocateInstance() {}\n"
-                  "ns1:Disk.Id=\"sdc\".EnumerateProperties() {}\n" +
-                  Calls("ns1:Disk.Id=\"sdc\"", {"Id.GetValue() {}", "Id.GetPropertyDecl() {}", "Id.Decl.GetName() {}"}) +
-                  Calls("ns0:new Disk", {"GetProperty(\"Id\") {}", "Id.SetValue(\"sdc\") {}"}) +
-                  Calls("ns1:Disk.Id=\"sdc\"", {"Size.GetValue() {}", "Size.GetPropertyDecl() {}", "Size.Decl.GetName() {}"}) +
-                  Calls("ns0:new Disk", {"GetProperty(\"Size\") {}", "Size.SetValue(7) {}", "AddToNamespace() {}"}) +
-                  Record(4, "Disk.Id=\"sda\"", "Size", "1", 3) + kEndOfWalk,
+                  Record(2, "Disk.Id=\"sdc\"", "", "1", 2) + Copied("sdc", 7) + Record(4, "Disk.Id=\"sda\"", "Size", "1", 3) +
+                  kEndOfWalk,
               CallsOfRun());
+}
+
+// The calls after the class record is there.
+std::string OfTheRecords(const std::string& calls)
+{
+    const std::size_t start = calls.find(kClassRecord);
+    return start == std::string::npos ? "no class record" : calls.substr(start + kClassRecord.size());
+}
+
+TEST_P(RunCallsTest, OfTwoNamespacesAnInstanceAtATime)
+{
+    Disk(0, "sda", 1);
+    Disk(0, "sdb", 2);
+    Disk(1, "sdc", 3);
+    Disk(1, "sdd", 4);
+    Rules("default=\"include\"");
+    EXPECT_EQ(Record(1, "Disk.Id=\"sda\"", "", "1", 1) + Marked("sda") +      //
+                  Record(1, "Disk.Id=\"sdb\"", "", "1", 2) + Marked("sdb") +  //
+                  "ns1:Disk.EnumerateInstances(false) {}\n" + Key("ns1", "sdc") + Key("ns1", "sdd") +
+                  Record(2, "Disk.Id=\"sdc\"", "", "1", 3) + Copied("sdc", 3) +  //
+                  Record(2, "Disk.Id=\"sdd\"", "", "1", 4) + Copied("sdd", 4) + kEndOfWalk,
+              OfTheRecords(CallsOfRun()));
+}
+
+// An absent instance where keys are excluded.
+std::string RecordWithAlias(const std::string& id, int number)
+{
+    const std::string path = "root/cimv2:Disk.Id=\"" + id + "\"";
+    return "ns0:Disk.Id=\"" + id + "\".GetReference() {}\n" + "store.GetClass(\"Disk\") {nsIndex=0}\n" +
+           (number == 1 ? "ns0.GetClass(\"Disk\") {nsIndex=0}\n" : "") + Record(1, path, "", "1", number);
+}
+
+TEST_P(RunCallsTest, OfTwoNamespacesAnInstanceAtATimeWhereKeysAreExcluded)
+{
+    Disk(0, "sda", 1);
+    Disk(0, "sdb", 2);
+    Disk(1, "sdc", 3);
+    Disk(1, "sdd", 4);
+    Rules("default=\"include\" excludekeys=\"Other\"");
+    EXPECT_EQ(RecordWithAlias("sda", 1) + Marked("sda") +      //
+                  RecordWithAlias("sdb", 2) + Marked("sdb") +  //
+                  "ns1:Disk.EnumerateInstances(false) {}\n" + Key("ns1", "sdc") + Key("ns1", "sdd") +
+                  Record(2, "Disk.Id=\"sdc\"", "", "1", 3) + Copied("sdc", 3) +  //
+                  Record(2, "Disk.Id=\"sdd\"", "", "1", 4) + Copied("sdd", 4) + kEndOfWalk,
+              OfTheRecords(CallsOfRun()));
 }
 
 TEST_P(RunCallsTest, OfThreeNamespaces)

@@ -3,30 +3,35 @@
 namespace NORVZEL20 {
 namespace {
 
-class GrammarTest : public TSpecFixture {};
+class GrammarTest : public TSpecFixture, public testing::WithParamInterface<EHost> {
+  protected:
+    GrammarTest() : TSpecFixture(GetParam()) {}
+};
 
-TEST_F(GrammarTest, AnEmptyDocumentGivesNoRules)
+INSTANTIATE_TEST_SUITE_P(Hosts, GrammarTest, testing::Values(EHost::kPlain, EHost::kInmem), testing::PrintToStringParamName());
+
+TEST_P(GrammarTest, AnEmptyDocumentGivesNoRules)
 {
     EXPECT_EQ("", Read("<DifftoolSpec/>"));
     EXPECT_EQ("", Read("<?xml version=\"1.0\"?>\n<DifftoolSpec version=\"1.0\"></DifftoolSpec>\n"));
     EXPECT_EQ("", TakeLog());
 }
 
-TEST_F(GrammarTest, VersionsUpToOnePointZeroAreAcceptedAsText)
+TEST_P(GrammarTest, VersionsUpToOnePointZeroAreAcceptedAsText)
 {
     for (const std::string version : {"1.0", "1", "0.9", "0.5.3", "0.1", ""}) {
         EXPECT_EQ("", Read("<DifftoolSpec version=\"" + version + "\"/>")) << version;
     }
 }
 
-TEST_F(GrammarTest, VersionsThatCompareGreaterAreRefused)
+TEST_P(GrammarTest, VersionsThatCompareGreaterAreRefused)
 {
     for (const std::string version : {"1.1", "1.00", "1.01", "2", "10", "a"}) {
         EXPECT_EQ("status 9", Read("<DifftoolSpec version=\"" + version + "\"/>")) << version;
     }
 }
 
-TEST_F(GrammarTest, AFullDocumentIsRead)
+TEST_P(GrammarTest, AFullDocumentIsRead)
 {
     EXPECT_EQ("Base include B:EXCLUDE -Id -Name\n"
               "Other exclude A:INCLUDE\n"
@@ -45,25 +50,25 @@ TEST_F(GrammarTest, AFullDocumentIsRead)
                    "</DifftoolSpec>\n"));
 }
 
-TEST_F(GrammarTest, AClassWithoutListsHasDefaultAndExcludedKeysOnly)
+TEST_P(GrammarTest, AClassWithoutListsHasDefaultAndExcludedKeysOnly)
 {
     EXPECT_EQ("Other include -Id\n",
               Read("<DifftoolSpec><class excludekeys=\"Id\" default=\"include\" name=\"Other\"/></DifftoolSpec>"));
 }
 
-TEST_F(GrammarTest, WithoutADefaultEverythingIsExcluded)
+TEST_P(GrammarTest, WithoutADefaultEverythingIsExcluded)
 {
     EXPECT_EQ("Other exclude\n", Read("<DifftoolSpec><class name=\"Other\"/></DifftoolSpec>"));
 }
 
-TEST_F(GrammarTest, ExcludedKeysAreSeparatedByAnyWhiteSpace)
+TEST_P(GrammarTest, ExcludedKeysAreSeparatedByAnyWhiteSpace)
 {
     EXPECT_EQ("Other exclude -KeyA -KeyB -KeyC\n",
               Read("<DifftoolSpec><class name=\"Other\" excludekeys=\"  KeyA&#9;KeyB&#10; KeyC \"/></DifftoolSpec>"));
     EXPECT_EQ("Other exclude\n", Read("<DifftoolSpec><class name=\"Other\" excludekeys=\" \"/></DifftoolSpec>"));
 }
 
-TEST_F(GrammarTest, ListsComeInAnyOrderAndNumber)
+TEST_P(GrammarTest, ListsComeInAnyOrderAndNumber)
 {
     EXPECT_EQ("Base exclude A:EXCLUDE B:INCLUDE Id:INCLUDE Kind:EXCLUDE\n"
               "Sub exclude A:EXCLUDE B:INCLUDE Id:INCLUDE Kind:EXCLUDE\n",
@@ -73,7 +78,7 @@ TEST_F(GrammarTest, ListsComeInAnyOrderAndNumber)
                    "</class></DifftoolSpec>"));
 }
 
-TEST_F(GrammarTest, TheFirstListingOfAPropertyStays)
+TEST_P(GrammarTest, TheFirstListingOfAPropertyStays)
 {
     EXPECT_EQ("Other exclude A:INCLUDE\n", Read("<DifftoolSpec><class name=\"Other\"><includelist><value>A</value></includelist>"
                                                 "<excludelist><value>A</value></excludelist></class></DifftoolSpec>"));
@@ -81,38 +86,38 @@ TEST_F(GrammarTest, TheFirstListingOfAPropertyStays)
                                                 "<includelist><value>A</value></includelist></class></DifftoolSpec>"));
 }
 
-TEST_F(GrammarTest, InheritedPropertiesMayBeListed)
+TEST_P(GrammarTest, InheritedPropertiesMayBeListed)
 {
     EXPECT_EQ("Sub exclude A:INCLUDE C:INCLUDE\n",
               Read("<DifftoolSpec><class "
                    "name=\"Sub\"><includelist><value>A</value><value>C</value></includelist></class></DifftoolSpec>"));
 }
 
-TEST_F(GrammarTest, AttributesOfListsAndValuesAreIgnored)
+TEST_P(GrammarTest, AttributesOfListsAndValuesAreIgnored)
 {
     EXPECT_EQ("Other exclude A:INCLUDE\n", Read("<DifftoolSpec><class name=\"Other\"><includelist x=\"1\"><value "
                                                 "y=\"2\">A</value></includelist></class></DifftoolSpec>"));
 }
 
-TEST_F(GrammarTest, TextOutsideValuesIsThrownAway)
+TEST_P(GrammarTest, TextOutsideValuesIsThrownAway)
 {
     EXPECT_EQ("Other exclude A:INCLUDE\n",
               Read("<DifftoolSpec>x<class name=\"Other\">B<includelist>C<value>A</value>D</includelist>E</class>F</DifftoolSpec>"));
 }
 
-TEST_F(GrammarTest, EntitiesAndCommentsAreTheHostsBusiness)
+TEST_P(GrammarTest, EntitiesAndCommentsAreTheHostsBusiness)
 {
     EXPECT_EQ("Other exclude A:INCLUDE\n", Read("<DifftoolSpec><class name=\"Othe&#114;\"><includelist><value>&#65;<!-- c "
                                                 "--></value></includelist></class></DifftoolSpec>"));
 }
 
-TEST_F(GrammarTest, ANestedElementEndsItsValue)
+TEST_P(GrammarTest, ANestedElementEndsItsValue)
 {
     EXPECT_EQ("Other exclude A:INCLUDE\n",
               Read("<DifftoolSpec><class name=\"Other\"><includelist><value>A<x/></value></includelist></class></DifftoolSpec>"));
 }
 
-TEST_F(GrammarTest, AClassReadAfterItsAncestorPrevails)
+TEST_P(GrammarTest, AClassReadAfterItsAncestorPrevails)
 {
     EXPECT_EQ("Base include B:EXCLUDE\n"
               "Sub exclude final B:EXCLUDE C:INCLUDE\n",
@@ -121,7 +126,7 @@ TEST_F(GrammarTest, AClassReadAfterItsAncestorPrevails)
                    "<class name=\"Sub\"><includelist><value>C</value></includelist></class></DifftoolSpec>"));
 }
 
-TEST_F(GrammarTest, AnAncestorReadAfterItsSubclassOverridesIt)
+TEST_P(GrammarTest, AnAncestorReadAfterItsSubclassOverridesIt)
 {
     EXPECT_EQ("Base include B:EXCLUDE\n"
               "Sub include B:EXCLUDE C:INCLUDE -Id\n",
@@ -130,7 +135,7 @@ TEST_F(GrammarTest, AnAncestorReadAfterItsSubclassOverridesIt)
                    "<class name=\"Base\" default=\"include\"><excludelist><value>B</value></excludelist></class></DifftoolSpec>"));
 }
 
-TEST_F(GrammarTest, TheSecondElementOfAClassMergesAndTheThirdDoesNothing)
+TEST_P(GrammarTest, TheSecondElementOfAClassMergesAndTheThirdDoesNothing)
 {
     EXPECT_EQ(
         "Other exclude final A:EXCLUDE Id:INCLUDE -Id\n",
@@ -142,7 +147,7 @@ TEST_F(GrammarTest, TheSecondElementOfAClassMergesAndTheThirdDoesNothing)
              "</DifftoolSpec>"));
 }
 
-TEST_F(GrammarTest, AClassThatInheritedIsClosedByItsFirstOwnElement)
+TEST_P(GrammarTest, AClassThatInheritedIsClosedByItsFirstOwnElement)
 {
     EXPECT_EQ("Base include\n"
               "Sub exclude final C:INCLUDE\n",
@@ -151,7 +156,7 @@ TEST_F(GrammarTest, AClassThatInheritedIsClosedByItsFirstOwnElement)
                    "<class name=\"Sub\" default=\"include\"><excludelist><value>C</value></excludelist></class></DifftoolSpec>"));
 }
 
-TEST_F(GrammarTest, ExcludedKeysReachTheCopiesThatSubclassesStartWith)
+TEST_P(GrammarTest, ExcludedKeysReachTheCopiesThatSubclassesStartWith)
 {
     EXPECT_EQ(
         "Base exclude -Id\n"

@@ -4,8 +4,10 @@
 namespace NORVZEL20 {
 namespace {
 
-class SpecCallsTest : public TSpecFixture {
+class SpecCallsTest : public TSpecFixture, public testing::WithParamInterface<EHost> {
   protected:
+    SpecCallsTest() : TSpecFixture(GetParam()) {}
+
     std::string CallsOf(const std::string& document)
     {
         fComparison.GetWatch().Forget();
@@ -14,12 +16,14 @@ class SpecCallsTest : public TSpecFixture {
     }
 };
 
-TEST_F(SpecCallsTest, AnEmptyDocumentAsksNothing)
+INSTANTIATE_TEST_SUITE_P(Hosts, SpecCallsTest, testing::Values(EHost::kPlain, EHost::kInmem), testing::PrintToStringParamName());
+
+TEST_P(SpecCallsTest, AnEmptyDocumentAsksNothing)
 {
     EXPECT_EQ("", CallsOf("<DifftoolSpec version=\"1.0\"/>"));
 }
 
-TEST_F(SpecCallsTest, NamesAreLookedUpAsTheyAreReadAndRulesHandedDownAtTheEnd)
+TEST_P(SpecCallsTest, NamesAreLookedUpAsTheyAreReadAndRulesHandedDownAtTheEnd)
 {
     EXPECT_EQ("ns0.GetClass(\"Base\") {}\n"
               "ns0.GetClass(\"Base\") {}\n"
@@ -38,13 +42,13 @@ TEST_F(SpecCallsTest, NamesAreLookedUpAsTheyAreReadAndRulesHandedDownAtTheEnd)
                       "<excludelist><value>B</value></excludelist></class><class name=\"Other\"/></DifftoolSpec>"));
 }
 
-TEST_F(SpecCallsTest, ABadAttributeIsReportedBeforeTheClassIsLookedUp)
+TEST_P(SpecCallsTest, ABadAttributeIsReportedBeforeTheClassIsLookedUp)
 {
     EXPECT_EQ("", CallsOf("<DifftoolSpec><class name=\"Other\" zoo=\"\"/></DifftoolSpec>"));
     EXPECT_EQ("", CallsOf("<DifftoolSpec><class/></DifftoolSpec>"));
 }
 
-TEST_F(SpecCallsTest, TheFirstNamespaceIsTheSchema)
+TEST_P(SpecCallsTest, TheFirstNamespaceIsTheSchema)
 {
     fNamespaces.insert(fNamespaces.begin(), fComparison.Watched(1));
     EXPECT_EQ("ns1.GetClass(\"Base\") {}\n", CallsOf("<DifftoolSpec><class name=\"Base\"/></DifftoolSpec>"));

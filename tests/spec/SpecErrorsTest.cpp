@@ -1,6 +1,8 @@
 #include <boost/smart_ptr/make_shared.hpp>
+#include <stdexcept>
 #include <typeinfo>
 
+#include "embedded/TAssertionFailure.h"
 #include "host/TZELException.h"
 #include "spec/TDiffXMLParser.h"
 #include "tests/spec/TSpecFixture.h"
@@ -102,14 +104,22 @@ const std::vector<TBadSpec> kBadLists = {
     {InValue("Z"), 4, "Invalid property \"Z\" specified on line #\n", EEvent::kEnd},
     {InValue(""), 4, "Invalid property \"\" specified on line #\n", EEvent::kEnd},
     {InValue(" A "), 4, "Invalid property \" A \" specified on line #\n", EEvent::kEnd},
-    {InValue("a"), 4, "Invalid property \"a\" specified on line #\n", EEvent::kEnd},
     {InValue("\nA"), 5, "Invalid property \"\nA\" specified on line #\n", EEvent::kEnd},
     {InClass("<excludelist>\n<value>Z</value>\n</excludelist>"), 4, "Invalid property \"Z\" specified on line #\n", EEvent::kEnd},
     {InValue("Z<x/>"), 4, "Invalid property \"Z\" specified on line #\n", EEvent::kEnd},
 };
 
-class SpecErrorsTest : public TSpecFixture {
+// Names in another letter case than the schema's; whether it knows them is the host's business.
+const std::vector<TBadSpec> kOtherCase = {
+    {"<DifftoolSpec>\n<class name=\"other\"/>\n</DifftoolSpec>", 2, kNoClass},
+    {"<DifftoolSpec>\n<class name=\"OTHER\"/>\n</DifftoolSpec>", 2, kNoClass},
+    {InValue("a"), 4, "Invalid property \"a\" specified on line #\n", EEvent::kEnd},
+};
+
+class SpecErrorsTest : public TSpecFixture, public testing::WithParamInterface<EHost> {
   protected:
+    SpecErrorsTest() : TSpecFixture(GetParam()) {}
+
     void ExpectBothEntries(const std::vector<TBadSpec>& table)
     {
         for (const auto& bad : table) {
@@ -119,22 +129,54 @@ class SpecErrorsTest : public TSpecFixture {
     }
 };
 
-TEST_F(SpecErrorsTest, WrongRootsAreLoggedTwiceWithTheirLine)
+INSTANTIATE_TEST_SUITE_P(Hosts, SpecErrorsTest, testing::Values(EHost::kPlain, EHost::kInmem), testing::PrintToStringParamName());
+
+TEST_P(SpecErrorsTest, WrongRootsAreLoggedTwiceWithTheirLine)
 {
     ExpectBothEntries(kBadRoots);
 }
 
-TEST_F(SpecErrorsTest, WrongClassesAreLoggedTwiceWithTheirLine)
+TEST_P(SpecErrorsTest, WrongClassesAreLoggedTwiceWithTheirLine)
 {
     ExpectBothEntries(kBadClasses);
 }
 
-TEST_F(SpecErrorsTest, WrongListsAreLoggedTwiceWithTheirLine)
+TEST_P(SpecErrorsTest, WrongListsAreLoggedTwiceWithTheirLine)
 {
     ExpectBothEntries(kBadLists);
 }
 
-TEST_F(SpecErrorsTest, TheFullTextOfAnErrorOnLineTwelve)
+class ExactNamesTest : public SpecErrorsTest {};
+
+INSTANTIATE_TEST_SUITE_P(Hosts, ExactNamesTest, testing::Values(EHost::kPlain), testing::PrintToStringParamName());
+
+TEST_P(ExactNamesTest, NamesInAnotherLetterCaseAreUnknown)
+{
+    ExpectBothEntries(kOtherCase);
+}
+
+class TolerantHostTest : public SpecErrorsTest {};
+
+INSTANTIATE_TEST_SUITE_P(Hosts, TolerantHostTest, testing::Values(EHost::kInmem), testing::PrintToStringParamName());
+
+TEST_P(TolerantHostTest, NamesInAnotherLetterCaseAreKeptAsTheFileSpellsThem)
+{
+    EXPECT_EQ("Other exclude a:INCLUDE\n", Read(InValue("a")));
+    EXPECT_EQ("Sub include A:EXCLUDE\n"
+              "base include A:EXCLUDE\n",
+              Read("<DifftoolSpec><class name=\"base\" default=\"include\"><excludelist><value>A</value></excludelist></class>"
+                   "</DifftoolSpec>"));
+    EXPECT_EQ("", TakeLog());
+}
+
+TEST_P(TolerantHostTest, TwoSpellingsOfAClassAreTwoEntries)
+{
+    EXPECT_EQ("Other exclude\n"
+              "other include\n",
+              Read("<DifftoolSpec><class name=\"Other\"/><class name=\"other\" default=\"include\"/></DifftoolSpec>"));
+}
+
+TEST_P(SpecErrorsTest, TheFullTextOfAnErrorOnLineTwelve)
 {
     std::string document = "<DifftoolSpec>\n";
     document.append(10, '\n');
@@ -147,28 +189,28 @@ TEST_F(SpecErrorsTest, TheFullTextOfAnErrorOnLineTwelve)
     EXPECT_EQ(std::string::npos, log.find("Previous error"));
 }
 
-TEST_F(SpecErrorsTest, AnotherFailureOfTheClassLookUpKeepsItsStatus)
+TEST_P(SpecErrorsTest, AnotherFailureOfTheClassLookUpKeepsItsStatus)
 {
     fComparison.GetWatch().FailCallsOf("ns0.GetClass(\"Other\")", TZELStatusCode::kNamespaceGone);
     EXPECT_EQ("status 18", Read("<DifftoolSpec>\n<class name=\"Other\"/></DifftoolSpec>"));
     EXPECT_EQ(BarrierEntry(EEvent::kStart, TZELStatusCode::kNamespaceGone, 2), TakeLog());
 }
 
-TEST_F(SpecErrorsTest, AnotherFailureOfThePropertyLookUpKeepsItsStatus)
+TEST_P(SpecErrorsTest, AnotherFailureOfThePropertyLookUpKeepsItsStatus)
 {
     fComparison.GetWatch().FailCallsOf("ns0:Other.GetPropertyDecl(\"A\")", TZELStatusCode::kTypeMismatch);
     EXPECT_EQ("status 13", Read(InValue("A")));
     EXPECT_EQ(BarrierEntry(EEvent::kEnd, TZELStatusCode::kTypeMismatch, 4), TakeLog());
 }
 
-TEST_F(SpecErrorsTest, AClassThatIsGoneWhenItsPropertyIsLookedUpMakesThePropertyInvalid)
+TEST_P(SpecErrorsTest, AClassThatIsGoneWhenItsPropertyIsLookedUpMakesThePropertyInvalid)
 {
     fComparison.GetWatch().FailCall(2, TZELStatusCode::kNotFound);
     EXPECT_EQ("status 9", Read(InValue("A")));
     EXPECT_EQ(BothEntries({InValue("A"), 4, "Invalid property \"A\" specified on line #\n", EEvent::kEnd}), TakeLog());
 }
 
-TEST_F(SpecErrorsTest, AnotherFailureOfThePropertysClassLookUpKeepsItsStatus)
+TEST_P(SpecErrorsTest, AnotherFailureOfThePropertysClassLookUpKeepsItsStatus)
 {
     fComparison.GetWatch().FailCall(2, TZELStatusCode::kNamespaceGone);
     EXPECT_EQ("status 18", Read(InValue("A")));
@@ -179,27 +221,43 @@ struct TSpecialException : TZELException {
     using TZELException::TZELException;
 };
 
-// A schema that has its class once, and then fails in its own way.
+// A schema that answers a number of times, and then throws in its own way.
+template <typename TFailure>
 class TFadingSchema : public TWatchedNamespace {
   public:
-    explicit TFadingSchema(boost::shared_ptr<ICIMNamespace> ns) : TWatchedNamespace(ns, boost::make_shared<TCallWatch>(), "fading")
+    TFadingSchema(boost::shared_ptr<ICIMNamespace> ns, int answers, const TFailure& failure)
+        : TWatchedNamespace(ns, boost::make_shared<TCallWatch>(), "fading"), fAnswers(answers), fFailure(failure)
     {}
 
     boost::shared_ptr<ICIMClass> GetClass(const std::string& name, TCallContext context) override
     {
-        if (++fTimes > 1) {
-            throw TSpecialException(TZELStatusCode::kNamespaceGone);
+        if (--fAnswers < 0) {
+            throw fFailure;
         }
         return TWatchedNamespace::GetClass(name, context);
     }
 
   private:
-    int fTimes = 0;
+    int fAnswers;
+    TFailure fFailure;
 };
 
-TEST_F(SpecErrorsTest, AFailureOfTheSchemaIsThrownAnew)
+class FadingSchemaTest : public SpecErrorsTest {
+  protected:
+    // From here on the schema is there for that many classes only.
+    template <typename TFailure>
+    void FadeAfter(int answers, const TFailure& failure)
+    {
+        fNamespaces[0] = boost::make_shared<TFadingSchema<TFailure>>(fComparison.Namespace(0).GetNamespace(), answers, failure);
+    }
+};
+
+INSTANTIATE_TEST_SUITE_P(Hosts, FadingSchemaTest, testing::Values(EHost::kPlain, EHost::kInmem), testing::PrintToStringParamName());
+
+TEST_P(FadingSchemaTest, AFailureIsThrownAnew)
 {
-    TCIMDiffEngine::TDiffXMLParser parser(boost::make_shared<TFadingSchema>(fComparison.Namespace(0).GetNamespace()));
+    FadeAfter(1, TSpecialException(TZELStatusCode::kNamespaceGone));
+    TCIMDiffEngine::TDiffXMLParser parser(fNamespaces[0]);
     std::map<std::string, std::string> attrs;
     parser.StartElement("DifftoolSpec", attrs);
     attrs["name"] = "Other";
@@ -213,24 +271,71 @@ TEST_F(SpecErrorsTest, AFailureOfTheSchemaIsThrownAnew)
     }
 }
 
-TEST_F(SpecErrorsTest, AFailureOfThePushDownKeepsItsStatus)
+TEST_P(FadingSchemaTest, WhatIsNoExceptionOfTheHostPassesWithoutAWordInTheLog)
+{
+    const std::string document = InValue("A");
+    for (const int answers : {0, 1, 2}) {  // in the start tag of the class, the end tag of the value, the end tag of the class
+        FadeAfter(answers, std::runtime_error("own"));
+        EXPECT_THROW(Read(document), std::runtime_error) << answers;
+        FadeAfter(answers, 5);
+        EXPECT_THROW(Read(document), int) << answers;
+        EXPECT_EQ("", TakeLog()) << answers;
+    }
+    FadeAfter(3, 5);
+    EXPECT_EQ("Other exclude A:INCLUDE\n", Read(document));
+}
+
+// A schema that answers a number of times, and then with a null class.
+class TEmptyingSchema : public TWatchedNamespace {
+  public:
+    TEmptyingSchema(boost::shared_ptr<ICIMNamespace> ns, int answers)
+        : TWatchedNamespace(ns, boost::make_shared<TCallWatch>(), "emptying"), fAnswers(answers)
+    {}
+
+    boost::shared_ptr<ICIMClass> GetClass(const std::string& name, TCallContext context) override
+    {
+        return --fAnswers < 0 ? nullptr : TWatchedNamespace::GetClass(name, context);
+    }
+
+  private:
+    int fAnswers;
+};
+
+TEST_P(SpecErrorsTest, ANullSchemaFailsTheAssertionAtTheFirstClass)
+{
+    fNamespaces[0] = nullptr;
+    EXPECT_EQ("", Read("<DifftoolSpec/>"));
+    EXPECT_THROW(Read("<DifftoolSpec><class name=\"Other\"/></DifftoolSpec>"), TAssertionFailure);
+    EXPECT_EQ(0u, TakeLog().find("0|Assertion failed: px != 0"));
+}
+
+TEST_P(SpecErrorsTest, ANullClassFailsTheAssertionWhereItIsAskedForMore)
+{
+    for (const int answers : {0, 1, 2}) {  // a class element asks for no more than its class
+        fNamespaces[0] = boost::make_shared<TEmptyingSchema>(fComparison.Namespace(0).GetNamespace(), answers);
+        EXPECT_THROW(Read(InValue("A")), TAssertionFailure) << answers;
+        const std::string log = TakeLog();
+        EXPECT_EQ(0u, log.find("0|Assertion failed: px != 0")) << answers;
+        EXPECT_EQ(std::string::npos, log.find("exception in")) << answers;
+    }
+}
+
+TEST_P(SpecErrorsTest, AFailureOfThePushDownKeepsItsStatus)
 {
     fComparison.GetWatch().FailCallsOf("ns0:Other.EnumerateSubClasses", TZELStatusCode::kNotFound);
     EXPECT_EQ("status 15", Read("<DifftoolSpec>\n<class name=\"Other\">\n</class></DifftoolSpec>"));
     EXPECT_EQ(BarrierEntry(EEvent::kEnd, TZELStatusCode::kNotFound, 3), TakeLog());
 }
 
-TEST_F(SpecErrorsTest, MalformedXmlIsLoggedOnceWithTheHostsMessage)
+TEST_P(SpecErrorsTest, MalformedXmlIsLoggedOnceWithTheHostsMessage)
 {
     EXPECT_EQ("status 9", Read("<DifftoolSpec>\n<class name=\"Other\"></DifftoolSpec>"));
-    const std::string log = TakeLog();
-    const std::string start = "0|Diff-XML Parser line 2:";
-    EXPECT_EQ(start, log.substr(0, start.size()));
-    EXPECT_LT(start.size() + 1, log.size());
-    EXPECT_EQ(std::string::npos, log.find("exception in"));
+    EXPECT_EQ("0|Diff-XML Parser line 2:mismatched tag|", TakeLog());
+    EXPECT_EQ("status 9", Read("<DifftoolSpec>\n<class name=\"Other\"/>\n"));
+    EXPECT_EQ("0|Diff-XML Parser line 3:no element found|", TakeLog());
 }
 
-TEST_F(SpecErrorsTest, FatalErrorLogsItsMessageAndThrows)
+TEST_P(SpecErrorsTest, FatalErrorLogsItsMessageAndThrows)
 {
     TCIMDiffEngine::TDiffXMLParser parser(fNamespaces[0]);
     try {
@@ -242,7 +347,7 @@ TEST_F(SpecErrorsTest, FatalErrorLogsItsMessageAndThrows)
     EXPECT_EQ("0|Diff-XML Parser line " + std::to_string(parser.GetCurLine()) + ":a message|", TakeLog());
 }
 
-TEST_F(SpecErrorsTest, NothingOfABadDocumentIsLeftBehind)
+TEST_P(SpecErrorsTest, NothingOfABadDocumentIsLeftBehind)
 {
     EXPECT_EQ("status 9", Read("<DifftoolSpec><class name=\"Base\"/><class/></DifftoolSpec>"));
     EXPECT_EQ("Other exclude\n", Read("<DifftoolSpec><class name=\"Other\"/></DifftoolSpec>"));

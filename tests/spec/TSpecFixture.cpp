@@ -19,7 +19,7 @@ TNamespaceBuilder::TProperty Property(const std::string& name)
 
 }  // namespace
 
-TSpecFixture::TSpecFixture() : fComparison(EHost::kPlain)
+TSpecFixture::TSpecFixture(EHost host) : fComparison(host)
 {
     fComparison.Namespace(0).Class("Base", "", {Key("Id"), Key("Name"), Key("Kind"), Property("A"), Property("B")});
     fComparison.Namespace(0).Class("Sub", "Base", {Property("C")}).Class("Other", "", {Key("Id"), Property("A")});

@@ -15,7 +15,7 @@ namespace NORVZEL20 {
 /// Reads specifications against a schema of three classes: Base (Id, Name and Kind are keys; A, B) > Sub (C), and Other (Id; A).
 class TSpecFixture : public testing::Test {
   protected:
-    TSpecFixture();
+    explicit TSpecFixture(EHost host = EHost::kPlain);
 
     /// The rules that a document gives, or `status 9` for the exception that it ends with.
     std::string Read(const std::string& document);

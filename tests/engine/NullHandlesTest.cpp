@@ -1,0 +1,106 @@
+#include <boost/smart_ptr/make_shared.hpp>
+#include <functional>
+
+#include "embedded/TAssertionFailure.h"
+#include "tests/engine/TAnsweringNamespace.h"
+#include "tests/engine/TPerClassFixture.h"
+#include "tests/support/TWatchedClass.h"
+#include "tests/support/TWatchedInstance.h"
+
+namespace NORVZEL20 {
+namespace {
+
+// A class whose instances are there for the first one who asks.
+class TVanishingClass : public TWatchedClass {
+  public:
+    explicit TVanishingClass(boost::shared_ptr<ICIMClass> cls) : TWatchedClass(cls, boost::make_shared<TCallWatch>(), "vanishing")
+    {}
+
+    void EnumerateInstances(const boost::function<bool(boost::shared_ptr<ICIMInstance>)>& callback, bool deep,
+                            TCallContext context) override
+    {
+        if (!fIsOver) {
+            GetWatched()->EnumerateInstances(callback, deep, context);
+        }
+        fIsOver = true;
+    }
+
+  private:
+    bool fIsOver = false;
+};
+
+// An instance without a size.
+class TSizelessInstance : public TWatchedInstance {
+  public:
+    explicit TSizelessInstance(boost::shared_ptr<ICIMInstance> instance)
+        : TWatchedInstance(instance, boost::make_shared<TCallWatch>(), "sizeless", "sizeless")
+    {}
+
+    boost::shared_ptr<ICIMProperty> GetProperty(const std::string& name, TCallContext context) const override
+    {
+        return name == "Size" ? nullptr : GetWatched()->GetProperty(name, context);
+    }
+};
+
+class TClassOfSizelessInstances : public TWatchedClass {
+  public:
+    explicit TClassOfSizelessInstances(boost::shared_ptr<ICIMClass> cls)
+        : TWatchedClass(cls, boost::make_shared<TCallWatch>(), "sizeless")
+    {}
+
+    void EnumerateInstances(const boost::function<bool(boost::shared_ptr<ICIMInstance>)>& callback, bool deep,
+                            TCallContext context) override
+    {
+        const auto passOn = [&](auto instance) { return callback(boost::make_shared<TSizelessInstance>(instance)); };
+        GetWatched()->EnumerateInstances(passOn, deep, context);
+    }
+};
+
+// What the host hands out empty is used all the same, and ends the run at the host's assertion.
+class NullHandlesTest : public TPerClassFixture, public testing::WithParamInterface<EHost> {
+  protected:
+    using TMakeClass = std::function<boost::shared_ptr<ICIMClass>(boost::shared_ptr<ICIMClass>)>;
+
+    NullHandlesTest() : TPerClassFixture(GetParam()) { Namespace(0); }
+
+    // The records of a run, by which the assertion has failed, with one more namespace: its Disk has one instance, "sda", and is
+    // what a test makes of it.
+    std::string RecordsOfRunAgainst(TMakeClass makeDisk)
+    {
+        fComparison.Prepare();
+        Disk(1, "sda", 1);
+        const auto other = Namespace(1).GetNamespace();
+        const auto answer = [&](const std::string& name) {
+            const auto cls = other->GetClass(name, TCallContext());
+            return name == "Disk" ? makeDisk(cls) : cls;
+        };
+        fComparison.Delta().AddNamespaceToCompareList(boost::make_shared<TAnsweringNamespace>(other, answer));
+        EXPECT_THROW(fComparison.Delta().FindDifferences(), TAssertionFailure);
+        EXPECT_EQ(0u, fLog.Take().find("0|Assertion failed: px != 0"));
+        return fComparison.Records();
+    }
+};
+
+INSTANTIATE_TEST_SUITE_P(Hosts, NullHandlesTest, testing::Values(EHost::kPlain, EHost::kInmem), testing::PrintToStringParamName());
+
+TEST_P(NullHandlesTest, AClassThatIsNullIsAskedForItsInstances)
+{
+    EXPECT_EQ("", RecordsOfRunAgainst([](auto) { return nullptr; }));
+}
+
+TEST_P(NullHandlesTest, APropertyThatIsNullIsAskedForItsValue)
+{
+    Disk(0, "sda", 1);
+    EXPECT_EQ("", RecordsOfRunAgainst([](auto cls) { return boost::make_shared<TClassOfSizelessInstances>(cls); }));
+}
+
+TEST_P(NullHandlesTest, AnInstanceThatVanishedIsRecordedAndEndsTheRunAtItsCopy)
+{
+    EXPECT_EQ("Disk\n  2 Disk.Bus=0,Id=\"sda\" [1]\n",
+              RecordsOfRunAgainst([](auto cls) { return boost::make_shared<TVanishingClass>(cls); }));
+    EXPECT_EQ(1u, fComparison.GetWatch().CountOf("ns0:Disk.AllocateInstance() {}"));
+    EXPECT_EQ("", Disks(0));
+}
+
+}  // namespace
+}  // namespace NORVZEL20
