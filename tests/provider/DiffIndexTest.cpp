@@ -1,3 +1,7 @@
+#include <iomanip>
+#include <iostream>
+#include <locale>
+
 #include "tests/provider/TDeltaFixture.h"
 
 namespace NORVZEL20 {
@@ -33,6 +37,39 @@ TEST_F(DiffIndexTest, PositionsOfComparedNamespacesAreReturned)
 TEST_F(DiffIndexTest, APositionBehindTheLastIsPrintedAndRefused)
 {
     EXPECT_EQ("status 15|Bad nsIndex, nsIndex=3\n", Ask(At(3)));
+    EXPECT_EQ("status 15|Bad nsIndex, nsIndex=65535\n", Ask(At(65535)));
+}
+
+// How standard output writes numbers, put back at the end.
+class TOddOutput {
+  public:
+    TOddOutput() : fFormat(nullptr), fLocale(std::cout.imbue(std::locale(std::locale::classic(), new TGrouping)))
+    {
+        fFormat.copyfmt(std::cout);
+        std::cout << std::hex << std::showbase << std::showpos << std::uppercase << std::left << std::setfill('*') << std::setw(40);
+    }
+    TOddOutput(const TOddOutput&) = delete;
+    TOddOutput& operator=(const TOddOutput&) = delete;
+    ~TOddOutput()
+    {
+        std::cout.copyfmt(fFormat);
+        std::cout.imbue(fLocale);
+    }
+
+  private:
+    // Thousands apart, as some locales write them.
+    struct TGrouping : std::numpunct<char> {
+        char do_thousands_sep() const override { return ','; }
+        std::string do_grouping() const override { return "\3"; }
+    };
+
+    std::ios fFormat;
+    std::locale fLocale;
+};
+
+TEST_F(DiffIndexTest, TheNumberIsDecimalHoweverStandardOutputIsSet)
+{
+    const TOddOutput odd;
     EXPECT_EQ("status 15|Bad nsIndex, nsIndex=65535\n", Ask(At(65535)));
 }
 
