@@ -3,20 +3,21 @@
 #include <locale>
 
 #include "tests/provider/TDeltaFixture.h"
+#include "tests/support/TTestAccess.h"
 
 namespace NORVZEL20 {
 namespace {
 
 class DiffIndexTest : public TDeltaFixture {
   protected:
-    // What the call gives or throws, and what it writes to standard output.
+    // What the call gives or throws, and what it writes to standard output and to the log.
     std::string Ask(const TCallContext& context)
     {
         std::string answer;
         testing::internal::CaptureStdout();
         const int status = StatusOf([&] { answer = std::to_string(Delta().GetDiffIndex(context)); });
         const std::string output = testing::internal::GetCapturedStdout();
-        return (status == 0 ? answer : "status " + std::to_string(status)) + "|" + output;
+        return (status == 0 ? answer : "status " + std::to_string(status)) + "|" + output + fLog.Take();
     }
 
     std::string Ask(const TCIMValue& value)
@@ -104,6 +105,18 @@ TEST_F(DiffIndexTest, WithNothingToCompareEveryIndexIsRefused)
     EXPECT_EQ(15, StatusOf([&] { delta->GetDiffIndex(At(0)); }));
     EXPECT_EQ(38, StatusOf([&] { delta->GetDiffIndex(TCallContext()); }));
     EXPECT_EQ("Bad nsIndex, nsIndex=0\n", testing::internal::GetCapturedStdout());
+}
+
+TEST_F(DiffIndexTest, TheIndexIsHeldAgainstTheNumberCutToSixteenBits)
+{
+    while (TTestAccess::CompareList(Delta()).size() < 65536) {
+        Delta().AddNamespaceToCompareList(nullptr);
+    }
+    EXPECT_EQ("status 15|Bad nsIndex, nsIndex=0\n", Ask(At(0)));
+    EXPECT_EQ("status 15|Bad nsIndex, nsIndex=65535\n", Ask(At(65535)));
+    Delta().AddNamespaceToCompareList(nullptr);
+    EXPECT_EQ("0|", Ask(At(0)));
+    EXPECT_EQ("status 15|Bad nsIndex, nsIndex=1\n", Ask(At(1)));
 }
 
 TEST_F(DiffIndexTest, TheCallersContextIsLeftAsItWas)
