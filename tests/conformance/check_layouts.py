@@ -1,7 +1,7 @@
 #!/usr/bin/env python3
 """Compares the compiler's own dump of object layouts with the bases and fields that the types are to have, in their order.
 
-Usage: check_layouts.py CLANG ROOT EXPECTED
+Usage: check_layouts.py CLANG ROOT EXPECTED...
 
 Looks at each type that EXPECTED names. Prints the differences and fails where there are any. Exits with 77 (skipped) where there
 is no clang.

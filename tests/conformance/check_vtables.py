@@ -1,7 +1,7 @@
 #!/usr/bin/env python3
 """Compares the compiler's own dump of virtual tables with the order of operations that hosts rely on.
 
-Usage: check_vtables.py CLANG ROOT EXPECTED
+Usage: check_vtables.py CLANG ROOT EXPECTED...
 
 Prints the differences and fails where there are any. Exits with 77 (skipped) where there is no clang.
 """

@@ -2,6 +2,8 @@
 
 import difflib
 import os
+import pathlib
+import re
 import subprocess
 import sys
 
@@ -19,13 +21,20 @@ def readable(text):
 
 
 def check(probe, option, describe):
-    """Describes the dump with `describe(dump, expected)` and prints how that differs. Arguments: CLANG ROOT EXPECTED."""
-    clang, root, expected_file = sys.argv[1:]
+    """Describes the dump with `describe(dump, expected)` and prints how that differs. Arguments: CLANG ROOT EXPECTED...
+
+    What is expected are paragraphs, each headed by the name of a type; they are compared in the order of these names.
+    """
+    clang, root, *expected_files = sys.argv[1:]
     if not os.path.exists(clang):
         print("skipped: no clang++ was found")
         return SKIPPED
-    with open(expected_file) as file:
-        expected = "".join(line for line in file if not line.startswith("#"))
+    text = "".join(pathlib.Path(file).read_text() for file in expected_files)
+    text = re.sub(r"^#.*\n", "", text, flags=re.M)
+    expected = "".join(sorted(re.findall(r"^\S.*?\n\n", text, re.M | re.S)))
+    if not expected:
+        print("nothing is expected: is this the list?")
+        return 1
     actual = describe(dump(clang, root, probe, option), expected)
     if actual == expected:
         return 0
