@@ -16,7 +16,8 @@ class INamespaceProvider {
   public:
     virtual ~INamespaceProvider() = default;
 
-    /// The name it is found under; valid until the process ends.
+    /// The name it is found under; valid while the provider's library is loaded, but not once the handlers of the process's exit
+    /// run: one of them may destroy it.
     virtual const std::string& GetName(TCallContext context) const = 0;
 
     /// A new namespace of its own. What the flag means is the provider's; `name` is the namespace's name, such as "root/cimv2".

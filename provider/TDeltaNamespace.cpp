@@ -72,7 +72,9 @@ unsigned short TDeltaNamespace::GetDiffIndex(TCallContext context) const
     }
     const unsigned short index = entry->second;
     if (index >= NumContainers()) {
-        std::cout << "Bad nsIndex, nsIndex=" << index << std::endl;
+        const std::string line = "Bad nsIndex, nsIndex=" + std::to_string(index) + "\n";
+        // Unformatted: what others set of base, width or locale has no say.
+        std::cout.write(line.data(), static_cast<std::streamsize>(line.size())).flush();
         throw TZELException(TZELStatusCode::kNotFound);
     }
     return index;

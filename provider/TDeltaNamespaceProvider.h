@@ -12,8 +12,11 @@ namespace NORVZEL20 {
 /// The provider "delta", which hands out namespaces that compare other namespaces. The order of the virtual operations is part
 /// of the contract.
 ///
-/// Loading the library creates the one provider of the process and registers it with the host; it lives until the process ends.
-/// Threads: any, at any time; each operation but AllocateNamespace only reads.
+/// Loading the library creates the one provider of the process and registers it with the host; the library lets go of it, and of
+/// its name, in handlers of the process's exit.
+/// Threads: the first call of GetInstance must not overlap another, nor must the first of GetName: they take no lock. The load of
+/// the library makes the first of GetInstance, and a manager that looks at the name the first of GetName. After that any thread at
+/// any time; each operation but AllocateNamespace only reads.
 class TDeltaNamespaceProvider : public INamespaceProvider {
   public:
     /// The one provider, made by the first call. Never null.
@@ -25,7 +28,7 @@ class TDeltaNamespaceProvider : public INamespaceProvider {
     /// assertion.
     static TZELStatusCode Initialize();
 
-    /// "delta".
+    /// "delta"; valid until the handlers of the process's exit run.
     const std::string& GetName(TCallContext context) const override;
 
     /// A new delta namespace (a TDeltaNamespace) with the delta schema loaded and nothing to compare. The arguments are ignored.

@@ -1,5 +1,7 @@
 // Has the compiler lay out the virtual table of every type whose order of operations is part of the contract: a destructor sets
 // the table of its class. Compiled for the dump alone, never linked.
+#include "embedded/TInMemNamedElement.h"
+#include "embedded/TStubClass.h"
 #include "host/ICIMClass.h"
 #include "host/ICIMInstance.h"
 #include "host/ICIMNamespace.h"
@@ -43,6 +45,8 @@ PROBE(INamespaceProvider, INamespaceProvider);
 PROBE(INamespaceProviderManager, INamespaceProviderManager);
 PROBE(TNamespaceProviderManager, TNamespaceProviderManager);
 PROBE(TXmlParser, TXmlParser);
+PROBE(TInMemNamedElement, TInMemNamedElement<ICIMClass>);
+PROBE(TStubClass, TStubClass);
 PROBE(TDeltaNamespaceProvider, TDeltaNamespaceProvider);
 PROBE(TDeltaNamespace, TDeltaNamespace);
 PROBE(TDeltaClass, TDeltaClass);

@@ -107,6 +107,11 @@ TEST_F(DeltaClassTest, AnEmptyCallbackCannotBeCalled)
 {
     const auto base = Wrapper("Base", 1);
     EXPECT_THROW(base->EnumerateSubClasses(TClassCallback(), false, At(1)), boost::bad_function_call);
+    EXPECT_EQ("ns1:Base.EnumerateSubClasses(false) {nsIndex=1}\n"
+              "ns1:Sub.GetName() {nsIndex=1}\n"
+              "store.GetClass(\"Sub\") {nsIndex=1}\n"
+              "ns1.GetClass(\"Sub\") {nsIndex=1}\n",
+              Watch().TakeText());
 }
 
 TEST_F(DeltaClassTest, TheWrappingCallbackAsksWithItsOwnCopyOfTheContext)

@@ -1,18 +1,23 @@
+#include <iomanip>
+#include <iostream>
+#include <locale>
+
 #include "tests/provider/TDeltaFixture.h"
+#include "tests/support/TTestAccess.h"
 
 namespace NORVZEL20 {
 namespace {
 
 class DiffIndexTest : public TDeltaFixture {
   protected:
-    // What the call gives or throws, and what it writes to standard output.
+    // What the call gives or throws, and what it writes to standard output and to the log.
     std::string Ask(const TCallContext& context)
     {
         std::string answer;
         testing::internal::CaptureStdout();
         const int status = StatusOf([&] { answer = std::to_string(Delta().GetDiffIndex(context)); });
         const std::string output = testing::internal::GetCapturedStdout();
-        return (status == 0 ? answer : "status " + std::to_string(status)) + "|" + output;
+        return (status == 0 ? answer : "status " + std::to_string(status)) + "|" + output + fLog.Take();
     }
 
     std::string Ask(const TCIMValue& value)
@@ -33,6 +38,39 @@ TEST_F(DiffIndexTest, PositionsOfComparedNamespacesAreReturned)
 TEST_F(DiffIndexTest, APositionBehindTheLastIsPrintedAndRefused)
 {
     EXPECT_EQ("status 15|Bad nsIndex, nsIndex=3\n", Ask(At(3)));
+    EXPECT_EQ("status 15|Bad nsIndex, nsIndex=65535\n", Ask(At(65535)));
+}
+
+// How standard output writes numbers, put back at the end.
+class TOddOutput {
+  public:
+    TOddOutput() : fFormat(nullptr), fLocale(std::cout.imbue(std::locale(std::locale::classic(), new TGrouping)))
+    {
+        fFormat.copyfmt(std::cout);
+        std::cout << std::hex << std::showbase << std::showpos << std::uppercase << std::left << std::setfill('*') << std::setw(40);
+    }
+    TOddOutput(const TOddOutput&) = delete;
+    TOddOutput& operator=(const TOddOutput&) = delete;
+    ~TOddOutput()
+    {
+        std::cout.copyfmt(fFormat);
+        std::cout.imbue(fLocale);
+    }
+
+  private:
+    // Thousands apart, as some locales write them.
+    struct TGrouping : std::numpunct<char> {
+        char do_thousands_sep() const override { return ','; }
+        std::string do_grouping() const override { return "\3"; }
+    };
+
+    std::ios fFormat;
+    std::locale fLocale;
+};
+
+TEST_F(DiffIndexTest, TheNumberIsDecimalHoweverStandardOutputIsSet)
+{
+    const TOddOutput odd;
     EXPECT_EQ("status 15|Bad nsIndex, nsIndex=65535\n", Ask(At(65535)));
 }
 
@@ -67,6 +105,18 @@ TEST_F(DiffIndexTest, WithNothingToCompareEveryIndexIsRefused)
     EXPECT_EQ(15, StatusOf([&] { delta->GetDiffIndex(At(0)); }));
     EXPECT_EQ(38, StatusOf([&] { delta->GetDiffIndex(TCallContext()); }));
     EXPECT_EQ("Bad nsIndex, nsIndex=0\n", testing::internal::GetCapturedStdout());
+}
+
+TEST_F(DiffIndexTest, TheIndexIsHeldAgainstTheNumberCutToSixteenBits)
+{
+    while (TTestAccess::CompareList(Delta()).size() < 65536) {
+        Delta().AddNamespaceToCompareList(nullptr);
+    }
+    EXPECT_EQ("status 15|Bad nsIndex, nsIndex=0\n", Ask(At(0)));
+    EXPECT_EQ("status 15|Bad nsIndex, nsIndex=65535\n", Ask(At(65535)));
+    Delta().AddNamespaceToCompareList(nullptr);
+    EXPECT_EQ("0|", Ask(At(0)));
+    EXPECT_EQ("status 15|Bad nsIndex, nsIndex=1\n", Ask(At(1)));
 }
 
 TEST_F(DiffIndexTest, TheCallersContextIsLeftAsItWas)

@@ -46,11 +46,23 @@ TEST_P(DifferenceRunTest, RecordsOfRepeatedRunsAccumulate)
     EXPECT_EQ(once + once + once, fComparison.RecordsAfterRun());
 }
 
-TEST_P(DifferenceRunTest, ARunLeavesListAndSpecificationAsTheyWere)
+TEST_P(DifferenceRunTest, ARunLeavesListWrappersAndSpecificationAsTheyWere)
 {
-    fComparison.Run();
+    fComparison.Prepare();
+    const auto compared = TTestAccess::CompareList(fComparison.Delta());
+    TCallContext context;
+    context["nsIndex"] = TCIMValue(static_cast<unsigned short>(1));
+    fComparison.Delta().GetClass("Disk", context);
+    const auto wrappers = TTestAccess::ClassCache(fComparison.Delta());
+    EXPECT_EQ("Disk\n"
+              "  4 Disk.Id=\"sda\" Size [1]\n",
+              fComparison.RecordsAfterRun());
     EXPECT_EQ(fComparison.GetRulesPath(), TTestAccess::SpecFileName(fComparison.Delta()));
-    EXPECT_EQ(3, fComparison.Delta().NumContainers());
+    ASSERT_EQ(3u, compared.size());
+    EXPECT_EQ(compared, TTestAccess::CompareList(fComparison.Delta()));
+    ASSERT_EQ(3u, wrappers.size());
+    EXPECT_EQ(1u, wrappers[1].size());
+    EXPECT_EQ(wrappers, TTestAccess::ClassCache(fComparison.Delta()));
 }
 
 TEST_P(DifferenceRunTest, AnErrorOfTheSpecificationLeavesTheRun)

@@ -1,8 +1,11 @@
 #include <boost/smart_ptr/make_shared.hpp>
 #include <boost/smart_ptr/weak_ptr.hpp>
 
+#include "provider/TDeltaClass.h"
 #include "provider/TDeltaNamespaceProvider.h"
 #include "tests/provider/TDeltaFixture.h"
+#include "tests/support/TPlainClass.h"
+#include "tests/support/TPlainNamespace.h"
 #include "tests/support/TTestAccess.h"
 #include "tests/support/TWatchedNamespace.h"
 
@@ -130,14 +133,27 @@ class TMortalNamespace : public TWatchedNamespace {
     std::string& fEnds;
 };
 
-TEST(LifecycleTest, TheStoreIsReleasedBeforeTheComparedNamespaces)
+// A class that notes its end.
+class TMortalClass : public TPlainClass {
+  public:
+    TMortalClass(const std::string& name, std::string& ends) : TPlainClass(name, nullptr, nullptr), fEnds(ends) {}
+    ~TMortalClass() override { fEnds += "class "; }
+
+  private:
+    std::string& fEnds;
+};
+
+TEST(LifecycleTest, TheStoreIsReleasedFirstThenTheComparedNamespacesThenTheWrappers)
 {
     std::string ends;
     auto delta = WithoutStore();
     delta->AddNamespaceToCompareList(boost::make_shared<TMortalNamespace>("compared", ends));
     TTestAccess::SetStore(*delta, boost::make_shared<TMortalNamespace>("store", ends));
+    // One that does not hold the namespace, as its own wrappers do.
+    TTestAccess::PutWrapper(*delta, 0, "Disk",
+                            boost::make_shared<TDeltaClass>(nullptr, boost::make_shared<TMortalClass>("Disk", ends)));
     delta.reset();
-    EXPECT_EQ("store compared ", ends);
+    EXPECT_EQ("store compared class ", ends);
 }
 
 TEST(LifecycleTest, AssignmentCopiesNothing)

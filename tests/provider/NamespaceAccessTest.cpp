@@ -147,6 +147,7 @@ TEST_F(OddNamespaceTest, AnotherStatusOfTheStoreIsThrownAnew)
         EXPECT_EQ(typeid(TZELException), typeid(error));
     }
     EXPECT_EQ("", Watch().TakeText());
+    EXPECT_EQ("", fLog.Take());
 }
 
 TEST_F(OddNamespaceTest, OtherExceptionsOfTheStorePassThrough)

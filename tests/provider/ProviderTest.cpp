@@ -1,6 +1,8 @@
 #include <gmock/gmock.h>
 
+#include "host/TNamespacePopulator.h"
 #include "host/TNamespaceProviderManager.h"
+#include "host/TOSSpecific.h"
 #include "provider/TDeltaNamespaceProvider.h"
 #include "tests/provider/TDeltaFixture.h"
 #include "tests/support/TTestAccess.h"
@@ -72,6 +74,18 @@ TEST(ProviderTest, ArgumentsMakeNoDifference)
             EXPECT_EQ(0, ns->NumContainers());
             EXPECT_EQ("KALMO_Delta", ns->GetClass("KALMO_Delta", kNone)->GetName(kNone));
         }
+    }
+}
+
+TEST(ProviderTest, TheHostLoadsTheSchemaIntoNamespacesOfInmemAlone)
+{
+    TCapturingLogger log;
+    const std::string schema = TOSSpecific::GetZELRootPath() + "/data/deltaclasses.properties.xml";
+    for (const boost::shared_ptr<ICIMNamespace>& ns : {boost::shared_ptr<ICIMNamespace>(), MakeNamespace(EHost::kPlain, "plain")}) {
+        EXPECT_EQ(31, StatusOf([&] { TNamespacePopulator::PopulateFromXMLFile(ns, schema); }));
+        EXPECT_EQ("0|" + schema + ": the namespace is none of the provider \"inmem\", load into one of those|", log.Take());
+        EXPECT_EQ(11, StatusOf([&] { TNamespacePopulator::PopulateFromXMLFile(ns, schema + ".missing"); }));
+        EXPECT_NE("", log.Take());
     }
 }
 

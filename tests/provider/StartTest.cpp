@@ -23,6 +23,7 @@ bool gIsManagerMissing = false;
 int gRegistrationStatus = 0;
 int gPopulationStatus = 0;
 int gAllocationStatus = 0;
+bool gIsStoreNull = false;
 const char* gRoot = "";
 std::string* gCalls = nullptr;
 
@@ -52,7 +53,7 @@ class TTellingProvider : public INamespaceProvider {
         if (gAllocationStatus != 0) {
             throw TZELException(static_cast<TZELStatusCode::EStatusCode>(gAllocationStatus));
         }
-        const auto store = TPlainNamespace::Create(name);
+        const auto store = gIsStoreNull ? nullptr : TPlainNamespace::Create(name);
         fStore = store;
         return store;
     }
@@ -100,6 +101,7 @@ boost::shared_ptr<TNamespaceProviderManager> TNamespaceProviderManager::GetInsta
 
 std::string TOSSpecific::GetZELRootPath()
 {
+    *gCalls += "GetZELRootPath\n";
     return gRoot;
 }
 
@@ -129,6 +131,7 @@ class StartTest : public testing::Test {
         Registry() = fRegistered;
         gPopulationStatus = 0;
         gAllocationStatus = 0;
+        gIsStoreNull = false;
     }
 
     static TProviders& Registry() { return ProvidersOf(*TNamespaceProviderManager::GetInstance()); }
@@ -149,6 +152,7 @@ class StartTest : public testing::Test {
 TEST_F(StartTest, TheStoreIsAllocatedAndFilledWithTheSchema)
 {
     EXPECT_EQ("AllocateNamespace {} false \"root/cimv2\"\n"
+              "GetZELRootPath\n"
               "PopulateFromXMLFile store /opt/x/data/deltaclasses.properties.xml\n",
               CallsWithRoot("/opt/x"));
 }
@@ -174,6 +178,7 @@ TEST_F(StartTest, AFailureOfThePopulatorLeavesNothingBehind)
     gPopulationStatus = TZELStatusCode::kParseError;
     EXPECT_EQ(9, StatusOf([&] { CallsWithRoot("/opt/x"); }));
     EXPECT_EQ("AllocateNamespace {} false \"root/cimv2\"\n"
+              "GetZELRootPath\n"
               "PopulateFromXMLFile store /opt/x/data/deltaclasses.properties.xml\n",
               fCalls);
     EXPECT_TRUE(fProvider->IsStoreGone());
@@ -185,6 +190,15 @@ TEST_F(StartTest, AFailureOfTheStoreProviderLeavesTheAllocation)
     gAllocationStatus = TZELStatusCode::kOutOfMemory;
     EXPECT_EQ(4, StatusOf([&] { CallsWithRoot("/opt/x"); }));
     EXPECT_EQ("AllocateNamespace {} false \"root/cimv2\"\n", fCalls);
+}
+
+TEST_F(StartTest, AStoreProviderThatAnswersNullLeavesItToThePopulator)
+{
+    gIsStoreNull = true;
+    EXPECT_EQ("AllocateNamespace {} false \"root/cimv2\"\n"
+              "GetZELRootPath\n"
+              "PopulateFromXMLFile null /opt/x/data/deltaclasses.properties.xml\n",
+              CallsWithRoot("/opt/x"));
 }
 
 TEST_F(StartTest, AMissingStoreProviderFailsTheAssertion)

@@ -1,7 +1,10 @@
+#include <boost/smart_ptr/make_shared.hpp>
+
 #include "provider/TDeltaNamespaceProvider.h"
 #include "tests/provider/TDeltaFixture.h"
 #include "tests/support/Dump.h"
 #include "tests/support/TTestAccess.h"
+#include "tests/support/TWatchedNamespace.h"
 
 namespace NORVZEL20 {
 namespace {
@@ -59,6 +62,34 @@ TEST_F(StoreAccessTest, QueriesGoToTheStoreAsTheyAre)
     const auto callback = [](boost::shared_ptr<ICIMInstance>) { return true; };
     EXPECT_EQ(31, StatusOf([&] { Delta().ExecuteQuery(callback, language, query, At(1)); }));
     EXPECT_EQ("store.ExecuteQuery(\"a language\", \"select * from nothing\") {nsIndex=1}\n", Watch().TakeText());
+}
+
+// Notes the objects that a query comes with.
+class TQueriedNamespace : public TWatchedNamespace {
+  public:
+    TQueriedNamespace() : TWatchedNamespace(MakeNamespace(EHost::kPlain, "queried"), boost::make_shared<TCallWatch>(), "queried") {}
+
+    void ExecuteQuery(const boost::function<bool(boost::shared_ptr<ICIMInstance>)>& callback, std::string& language,
+                      std::string& query, TCallContext) override
+    {
+        fObjects = {&callback, &language, &query};
+        language = "another language";
+        query = "another query";
+    }
+
+    std::vector<const void*> fObjects;
+};
+
+TEST_F(StoreAccessTest, TheStoreQueriesWithTheCallersOwnObjects)
+{
+    const auto store = boost::make_shared<TQueriedNamespace>();
+    TTestAccess::SetStore(Delta(), store);
+    std::string language = "a language";
+    std::string query = "select * from nothing";
+    const boost::function<bool(boost::shared_ptr<ICIMInstance>)> callback = [](boost::shared_ptr<ICIMInstance>) { return true; };
+    Delta().ExecuteQuery(callback, language, query, At(1));
+    EXPECT_EQ((std::vector<const void*>{&callback, &language, &query}), store->fObjects);
+    EXPECT_EQ("another language, another query", language + ", " + query);
 }
 
 TEST_F(StoreAccessTest, ClearInstancesClearsNothing)

@@ -11,9 +11,13 @@
 namespace NORVZEL20 {
 
 /// A delta namespace over three compared ones of the plain host, everything watched. Each holds Base (key Id) > Sub.
+///
+/// Nothing but a run writes to the core log, whatever the status it fails with: each test ends with a look at it.
 class TDeltaFixture : public testing::Test {
   protected:
     TDeltaFixture();
+
+    void TearDown() override { EXPECT_EQ("", fLog.Take()); }
 
     /// A call context with that "nsIndex".
     static TCallContext At(unsigned short index);

@@ -19,6 +19,10 @@ struct TTestAccess {
     static const TClassCache& ClassCache(const TDeltaNamespace& ns) { return ns.fClassCache; }
     /// A wrapper holds its delta namespace, which holds the wrapper: forgetting the wrappers lets both go.
     static void ForgetWrappers(TDeltaNamespace& ns) { ns.fClassCache.assign(ns.fClassCache.size(), {}); }
+    static void PutWrapper(TDeltaNamespace& ns, std::size_t index, const std::string& name, boost::shared_ptr<TDeltaClass> wrapper)
+    {
+        ns.fClassCache.at(index)[name] = wrapper;
+    }
     static const std::vector<boost::shared_ptr<ICIMNamespace>>& CompareList(const TDeltaNamespace& ns) { return ns.fCompareList; }
     static boost::shared_ptr<ICIMNamespace> Store(const TDeltaNamespace& ns) { return ns.fDeltaStore; }
     static void SetStore(TDeltaNamespace& ns, boost::shared_ptr<ICIMNamespace> store) { ns.fDeltaStore = store; }

@@ -56,7 +56,8 @@ std::vector<std::string> DoAtOnce(const std::function<std::string()>& work)
     return results;
 }
 
-/// Checks that threads at once make what one makes alone. The one comes last, so that nothing is ready when they begin.
+/// Checks that threads at once make what one makes alone. The one comes last, so that nothing is ready when they begin but the
+/// provider: its first use is for one thread alone, and the load of its library makes it.
 void ExpectAsAlone(const std::function<std::string()>& work)
 {
     const std::vector<std::string> results = DoAtOnce(work);
