@@ -24,7 +24,7 @@ from operators import mutants_of
 
 ROOT = pathlib.Path(__file__).resolve().parents[2]
 FOLDERS = ("provider", "spec", "engine")
-TESTS = ("tests_spec", "tests_engine", "tests_provider", "tests_provider_start")
+TESTS = ("tests_spec", "tests_engine", "tests_provider", "tests_provider_start", "tests_host_process")
 TEST_SECONDS = 60
 
 
