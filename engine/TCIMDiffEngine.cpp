@@ -82,7 +82,7 @@ void TCIMDiffEngine::buildInstanceMap(boost::shared_ptr<TDiffClassRules> rules,
                                       std::map<std::string, TMasterInstance>& masterMap)
 {
     for (const boost::shared_ptr<ICIMInstance>& instance : instances) {
-        masterMap.emplace(buildPath(rules, instance), TMasterInstance{instance, 0});
+        masterMap.emplace(buildPath(rules, instance), TMasterInstance{instance});
     }
 }
 
