@@ -20,8 +20,8 @@ namespace NORVZEL20 {
 /// Each load is all or nothing: where it throws, the namespace is as it was.
 /// Errors of every load: TPopulateError with the statuses of TNamespacePopulator::PopulateFromXMLFile, 31 where the namespace is
 /// none of the provider "inmem"; std::bad_alloc. Nothing is logged. Threads: one at a time for each populator and namespace;
-/// several populators may work at once on namespaces of their own. Cost: one pass over the document, which is never held whole
-/// but by the caller of LoadFromMemory.
+/// several populators may work at once on namespaces of their own. Cost: one pass over the document; it is never held whole,
+/// but LoadFromMemory has the XML library copy it.
 class TCimXmlPopulator {
   public:
     /// Fills the buffer with at most so many bytes and returns how many; 0 ends the document, and is asked for once. May deliver as
