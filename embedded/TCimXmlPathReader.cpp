@@ -7,6 +7,9 @@ namespace NORVZEL20 {
 
 namespace {
 
+// What a path of the host holds; the object's own path counts.
+constexpr std::size_t kMaxDepth = 12;
+
 using EStatus = TZELStatusCode::EStatusCode;
 using TType = TCIMValue::TCIMType;
 
@@ -25,6 +28,9 @@ TCimXmlPathReader::TCimXmlPathReader(TCimXmlContext& context, boost::shared_ptr<
 
 void TCimXmlPathReader::Begin()
 {
+    if (fDepth == kMaxDepth)
+        fContext.Fail(EStatus::kParseError,
+                      "found object paths within each other more than " + std::to_string(kMaxDepth) + " deep, expected fewer");
     if (++fDepth > fFrames.size())
         fFrames.emplace_back();
     TFrame& frame = fFrames[fDepth - 1];

@@ -23,6 +23,7 @@ class TCimXmlPathReader {
     /// `ns` (may be null) is where classes are looked up.
     TCimXmlPathReader(TCimXmlContext& context, boost::shared_ptr<TInMemNamespace> ns);
 
+    /// Begins a path within the innermost. Errors: fails with status 9 where paths stand in each other too deeply.
     void Begin();
     /// Ends the innermost path. Errors: fails with status 9 where it has no class.
     TCIMReference End();

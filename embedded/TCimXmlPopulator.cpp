@@ -71,15 +71,15 @@ class TLoad {
     void ReadSource(const TCimXmlPopulator::TPullSource& source)
     {
         std::size_t total = 0;
-        for (;;) {
+        std::size_t length = 0;
+        std::size_t room = 0;
+        do {
             // A tag that goes on and on is read again with each piece: growing pieces keep that in proportion.
-            const std::size_t room = std::max(kPiece, fXml.GetPending());
-            const std::size_t length = source(fXml.GetBuffer(room), room);
-            if (length == 0)
-                break;
+            room = std::max(kPiece, fXml.GetPending());
+            length = Fill(source, fXml.GetBuffer(room), room);
             total += length;
             Check(fXml.ParseBuffer(length));
-        }
+        } while (length == room);
         RefuseEmpty(total);
         Check(fXml.Finish());
     }
@@ -96,6 +96,19 @@ class TLoad {
     }
 
   private:
+    /// Pulls until the room is full or the document ends, so that sources that deliver little make no small pieces.
+    static std::size_t Fill(const TCimXmlPopulator::TPullSource& source, char* buffer, std::size_t room)
+    {
+        std::size_t length = 0;
+        while (length < room) {
+            const std::size_t more = source(buffer + length, room - length);
+            if (more == 0)
+                break;
+            length += more;
+        }
+        return length;
+    }
+
     void RefuseEmpty(std::size_t length) const
     {
         if (length == 0)

@@ -20,12 +20,12 @@ namespace NORVZEL20 {
 /// Each load is all or nothing: where it throws, the namespace is as it was.
 /// Errors of every load: TPopulateError with the statuses of TNamespacePopulator::PopulateFromXMLFile, 31 where the namespace is
 /// none of the provider "inmem"; std::bad_alloc. Nothing is logged. Threads: one at a time for each populator and namespace;
-/// several populators may work at once on namespaces of their own. Cost: one pass over the document; a document is never held
-/// whole, except the file of LoadFile where it is a regular one.
+/// several populators may work at once on namespaces of their own. Cost: one pass over the document; it is never held whole,
+/// but LoadFromMemory has the XML library copy it.
 class TCimXmlPopulator {
   public:
-    /// Fills the buffer with at most so many bytes and returns how many; 0 ends the document. May throw: the load then fails with
-    /// that exception.
+    /// Fills the buffer with at most so many bytes and returns how many; 0 ends the document, and is asked for once. May deliver as
+    /// little as it likes: small pieces are gathered before they are parsed. May throw: the load then fails with that exception.
     using TPullSource = boost::function<std::size_t(char*, std::size_t)>;
 
     explicit TCimXmlPopulator(boost::shared_ptr<ICIMNamespace> ns);

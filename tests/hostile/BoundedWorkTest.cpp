@@ -1,5 +1,5 @@
 // Documents that never end: how much of them is read, and how much memory that takes, is counted.
-#include <gtest/gtest.h>
+#include <gmock/gmock.h>
 
 #include "embedded/TCimXmlPopulator.h"
 #include "fuzz/SampleInventory.h"
@@ -15,6 +15,10 @@ constexpr std::uint64_t kGigabyte = 1024 * kMegabyte;
 
 const std::string kGroup = "<CIM CIMVERSION=\"2.0\" DTDVERSION=\"2.0\"><DECLARATION><DECLGROUP>";
 const std::string kValue = kGroup + "<VALUE.OBJECT><INSTANCE CLASSNAME=\"Device\"><PROPERTY NAME=\"Id\" TYPE=\"string\"><VALUE>";
+
+const std::string kReference = kGroup + "<VALUE.OBJECT><INSTANCE CLASSNAME=\"Cable\"><PROPERTY.REFERENCE NAME=\"From\">";
+const std::string kArray =
+    kGroup + "<VALUE.OBJECT><INSTANCE CLASSNAME=\"Disk\"><PROPERTY.ARRAY NAME=\"Labels\" TYPE=\"string\"><VALUE.ARRAY>";
 
 /// Loads generated documents and looks at the cost.
 class BoundedWorkTest : public testing::Test {
@@ -50,6 +54,7 @@ TEST_F(BoundedWorkTest, ATextOfAGigabyteIsRefusedAtItsLimit)
     EXPECT_EQ("endless.xml:1:134217729: found malformed XML: text is too long",
               Load(TGeneratedText(kValue, "0123456789abcdef", kGigabyte / 16, "</VALUE>")));
     EXPECT_LE(fPulled, 136 * kMegabyte);
+    EXPECT_GE(fPeak, 128 * kMegabyte);
     EXPECT_LE(fPeak, 400 * kMegabyte);  // three times the limit: growing, a text is there twice
 }
 
@@ -68,7 +73,49 @@ TEST_F(BoundedWorkTest, ANameOfAGigabyteIsRefusedAtItsLimit)
     EXPECT_LE(fPeak, 100 * kMegabyte);
 }
 
-TEST_F(BoundedWorkTest, AGigabyteOfNestingIsRefusedAtOnce)
+/// What a recorded response returns from a method is read over, whatever it is.
+TEST_F(BoundedWorkTest, AGigabyteOfNestingIsRefusedForItsDepth)
+{
+    const std::string response = "<CIM CIMVERSION=\"2.0\" DTDVERSION=\"2.0\"><MESSAGE ID=\"1\" PROTOCOLVERSION=\"1.0\"><SIMPLERSP>"
+                                 "<METHODRESPONSE NAME=\"M\"><RETURNVALUE>\n";
+    EXPECT_EQ("endless.xml:9997:1: found malformed XML: elements are nested too deeply",
+              Load(TGeneratedText(response, "<x>\n", kGigabyte / 4, "")));
+    EXPECT_LE(fPulled, kMegabyte);
+    EXPECT_LE(fPeak, 4 * kMegabyte);
+}
+
+/// Keys may be paths, whose keys may be paths: text of such a path doubles its escapes with each.
+TEST_F(BoundedWorkTest, AGigabyteOfPathsWithinPathsIsRefusedForItsDepth)
+{
+    const std::string path = "<VALUE.REFERENCE>\n<INSTANCENAME CLASSNAME=\"Cable\"><KEYBINDING NAME=\"From\">";
+    EXPECT_EQ("endless.xml:12:57: found object paths within each other more than 12 deep, expected fewer",
+              Load(TGeneratedText(kReference, path, kGigabyte / path.size(), "")));
+    EXPECT_LE(fPulled, kMegabyte);
+    EXPECT_LE(fPeak, 2 * kMegabyte);
+}
+
+TEST_F(BoundedWorkTest, PathsWithinPathsUpToTheLimitAreLoadedAndTold)
+{
+    std::string beginning = kReference;
+    std::string end = "<KEYVALUE>x</KEYVALUE>";
+    for (int depth = 1; depth < 12; ++depth) {
+        beginning += "<VALUE.REFERENCE><INSTANCENAME CLASSNAME='Cable'><KEYBINDING NAME='From'>";
+        end += "</KEYBINDING></INSTANCENAME></VALUE.REFERENCE>";
+    }
+    end += "</PROPERTY.REFERENCE><PROPERTY.REFERENCE NAME='To'><VALUE.REFERENCE><CLASSNAME NAME='Disk'/></VALUE.REFERENCE>"
+           "</PROPERTY.REFERENCE></INSTANCE></VALUE.OBJECT></DECLGROUP></DECLARATION></CIM>";
+    const boost::shared_ptr<TInMemNamespace> ns = LoadSample();
+    const std::string document = beginning + end;
+    const TMemoryMeter meter;
+    TCimXmlPopulator populator(ns);
+    populator.KeepElements();
+    populator.LoadFromMemory(document.data(), document.size(), "deep.xml");
+    const auto cable = boost::dynamic_pointer_cast<ICIMInstance>(populator.TakeElements().at(0));
+    EXPECT_THAT(cable->GetReference(TCallContext()).GetPath(), testing::EndsWith(",To=\"Disk\""));
+    EXPECT_LE(meter.GetPeak(), kMegabyte);
+}
+
+TEST_F(BoundedWorkTest, AGigabyteOfElementsInTheWrongPlaceIsRefusedAtOnce)
 {
     EXPECT_EQ("endless.xml:1:40: found element <CIM> in <CIM>, expected <DECLARATION> or <MESSAGE>",
               Load(TGeneratedText("", "<CIM CIMVERSION=\"2.0\" DTDVERSION=\"2.0\">", kGigabyte / 40, "")));
@@ -87,10 +134,18 @@ TEST_F(BoundedWorkTest, MuchOfNothingTakesNoMemory)
 TEST_F(BoundedWorkTest, LongDefaultsOfAttributesAreRefusedBeforeTheyAddUp)
 {
     const std::string prolog = "<!DOCTYPE CIM [<!ATTLIST VALUE.NULL a CDATA \"" + std::string(kMegabyte, 'x') + "\">]>";
-    const std::string array =
-        kGroup + "<VALUE.OBJECT><INSTANCE CLASSNAME=\"Disk\"><PROPERTY.ARRAY NAME=\"Labels\" TYPE=\"string\"><VALUE.ARRAY>";
     EXPECT_EQ("endless.xml:1:1049294: found malformed XML: attribute defaults expand too much",
-              Load(TGeneratedText(prolog + array, "<VALUE.NULL/>", 100000, "</VALUE.ARRAY>")));
+              Load(TGeneratedText(prolog + kArray, "<VALUE.NULL/>", 100000, "</VALUE.ARRAY>")));
+    EXPECT_LE(fTotal, 100 * kMegabyte);
+}
+
+/// The same for an entity that every element names in an attribute.
+TEST_F(BoundedWorkTest, LongEntitiesInAttributesAreRefusedBeforeTheyAddUp)
+{
+    const std::string prolog = "<!DOCTYPE CIM [<!ENTITY e \"" + std::string(kMegabyte, 'x') + "\">]>";
+    EXPECT_EQ("endless.xml:1:1049168: found malformed XML: limit on input amplification factor (from DTD and entities) breached",
+              Load(TGeneratedText(prolog + kArray, "<VALUE.NULL a='&e;'/>", 100000, "</VALUE.ARRAY>")));
+    EXPECT_LE(fPeak, 32 * kMegabyte);
     EXPECT_LE(fTotal, 100 * kMegabyte);
 }
 

@@ -9,6 +9,9 @@
 
 namespace NORVZEL20 {
 
+/// What reading a document of a few lines may take.
+constexpr std::size_t kSmallBound = 256 * 1024;
+
 /// A hostile document, and what each reader must make of it.
 struct THostileRow {
     std::string name;
@@ -16,15 +19,26 @@ struct THostileRow {
     std::string parser;
     std::string populator;
     std::string specification;
+    std::size_t bound = kSmallBound;  ///< bytes that any of the readers may hold at a time
 };
 
-/// Shows every row to every reader; the name of a row that fails is printed.
+/// Readers free as they go, so that all they ever allocate is a small multiple of what they hold at a time.
+inline void ExpectReading(const std::string& told, std::size_t bound, const TReading& reading)
+{
+    EXPECT_EQ(told, reading.told);
+    EXPECT_LE(reading.peak, bound);
+    EXPECT_LE(reading.total, 4 * bound);
+}
+
+/// Shows every row to every reader, and looks at what each makes of it and at the memory that takes; the name of a row that fails
+/// is printed.
 inline void ExpectOutcomes(const std::vector<THostileRow>& rows)
 {
     for (const THostileRow& row : rows) {
-        EXPECT_EQ(row.parser, row.document.ReadByParser()) << row.name;
-        EXPECT_EQ(row.populator, row.document.LoadByPopulator()) << row.name;
-        EXPECT_EQ(row.specification, row.document.ReadAsSpecification()) << row.name;
+        SCOPED_TRACE(row.name);
+        ExpectReading(row.parser, row.bound, row.document.ReadByParser());
+        ExpectReading(row.populator, row.bound, row.document.LoadByPopulator());
+        ExpectReading(row.specification, row.bound, row.document.ReadAsSpecification());
     }
 }
 
@@ -43,6 +57,13 @@ inline THostileRow RefusedAt(const std::string& name, const THostileDocument& do
 inline THostileRow Refused(const std::string& name, const THostileDocument& document, std::size_t offset, const std::string& reason)
 {
     return RefusedAt(name, document, document.prolog.size() + kContentColumn + offset, reason);
+}
+
+/// The row with another bound on memory.
+inline THostileRow Within(std::size_t bound, THostileRow row)
+{
+    row.bound = bound;
+    return row;
 }
 
 /// A row for a harmless content, whatever stands before it.

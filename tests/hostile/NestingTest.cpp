@@ -2,7 +2,6 @@
 #include "embedded/TCimXmlPopulator.h"
 #include "embedded/TInMemNamespace.h"
 #include "tests/hostile/HostileRow.h"
-#include "tests/hostile/TMemoryMeter.h"
 
 namespace NORVZEL20 {
 
@@ -43,13 +42,14 @@ TEST(NestingTest, AMillionNestedElementsAreRefused)
 {
     const THostileDocument document{"", Repeat("<a>", 1000000) + Repeat("</a>", 1000000)};
     const std::string reason = "elements are nested too deeply";
-    ExpectOutcomes({{"nested", document, "line 1: " + reason, UnexpectedIn("a"), "status 9\nDiff-XML Parser line 1:" + reason}});
+    ExpectOutcomes({{"nested", document, "line 1: " + reason, UnexpectedIn("a"), "status 9\nDiff-XML Parser line 1:" + reason,
+                     12 * kMegabyte}});
 }
 
 TEST(NestingTest, TenThousandAttributesAreRefused)
 {
     const std::string many = "<a" + Attributes(10000) + "/>";
-    ExpectOutcomes({Refused("different ones", {"", many}, 0, "too many attributes"),
+    ExpectOutcomes({Within(2 * kMegabyte, Refused("different ones", {"", many}, 0, "too many attributes")),
                     Refused("one twice", {"", "<a b='' c='' b=''/>"}, 13, "duplicate attribute")});
 }
 
@@ -58,22 +58,27 @@ TEST(NestingTest, NamesOfAMegabyteAreNames)
 {
     const std::string name(kMegabyte, 'n');
     const std::string twoElements = "2 elements, text ''";
-    ExpectOutcomes({{"element", {"", "<" + name + "/>"}, twoElements, UnexpectedIn(std::string(80, 'n') + "..."), kEmptyProperty},
-                    {"attribute", {"", "<a " + name + "=''/>"}, twoElements, UnexpectedIn("a"), kEmptyProperty}});
+    ExpectOutcomes({{"element",
+                     {"", "<" + name + "/>"},
+                     twoElements,
+                     UnexpectedIn(std::string(80, 'n') + "..."),
+                     kEmptyProperty,
+                     8 * kMegabyte},
+                    {"attribute", {"", "<a " + name + "=''/>"}, twoElements, UnexpectedIn("a"), kEmptyProperty, 8 * kMegabyte}});
 }
 
 TEST(NestingTest, TagsBeyondTheLimitAreRefused)
 {
     const std::string name = "<" + std::string(20 * kMegabyte, 'n') + "/>";
     const std::string value = "<a b='" + std::string(20 * kMegabyte, 'v') + "'/>";
-    ExpectOutcomes(
-        {Refused("a name", {"", name}, 0, "a tag is too long"), Refused("a value", {"", value}, 0, "a tag is too long")});
+    ExpectOutcomes({Within(120 * kMegabyte, Refused("a name", {"", name}, 0, "a tag is too long")),
+                    Within(120 * kMegabyte, Refused("a value", {"", value}, 0, "a tag is too long"))});
 }
 
 /// What need not be kept may be as long as it likes.
 TEST(NestingTest, LongCommentsAreReadOver)
 {
-    ExpectOutcomes({Handled("a comment", {"", "I<!--" + std::string(20 * kMegabyte, '.') + "-->d"})});
+    ExpectOutcomes({Within(40 * kMegabyte, Handled("a comment", {"", "I<!--" + std::string(20 * kMegabyte, '.') + "-->d"}))});
 }
 
 /// Whoever walks a class tree does so recursively, so its height is bounded.
@@ -102,9 +107,10 @@ TEST(NestingTest, LongDefaultsOfAttributesAreRefusedBeforeTheyAddUp)
 {
     const std::string prolog = "<!DOCTYPE r [<!ATTLIST a b CDATA \"" + std::string(kMegabyte, 'x') + "\">]>";
     const THostileDocument document{prolog, Repeat("<a/>", 10000)};
-    TMemoryMeter meter;
-    EXPECT_EQ("line 1: attribute defaults expand too much", document.ReadByParser());
-    EXPECT_LT(meter.GetTotal(), 200 * kMegabyte);
+    const TReading reading = document.ReadByParser();
+    EXPECT_EQ("line 1: attribute defaults expand too much", reading.told);
+    EXPECT_LT(reading.peak, 16 * kMegabyte);
+    EXPECT_LT(reading.total, 100 * kMegabyte);
 }
 
 }  // namespace NORVZEL20

@@ -4,22 +4,35 @@
 
 namespace NORVZEL20 {
 
-char TGeneratedText::At(std::uint64_t position) const
+TGeneratedText::TGeneratedText(std::string beginning, const std::string& unit, std::uint64_t times, std::string end)
+    : fBeginning(std::move(beginning)), fUnitSize(unit.size()), fMiddleSize(unit.size() * times), fEnd(std::move(end))
+{
+    constexpr std::size_t kBlockSize = 64 * 1024;
+    while (fUnits.size() < kBlockSize && fUnits.size() < fMiddleSize)
+        fUnits += unit;
+}
+
+/// What stands at the position, as far as it is at hand in one piece.
+std::string_view TGeneratedText::At(std::uint64_t position) const
 {
     if (position < fBeginning.size())
-        return fBeginning[position];
+        return std::string_view(fBeginning).substr(static_cast<std::size_t>(position));
     position -= fBeginning.size();
-    if (position < fUnit.size() * fTimes)
-        return fUnit[position % fUnit.size()];
-    return fEnd[position - fUnit.size() * fTimes];
+    if (position < fMiddleSize) {
+        const std::string_view units = std::string_view(fUnits).substr(static_cast<std::size_t>(position % fUnitSize));
+        return units.substr(0, static_cast<std::size_t>(std::min<std::uint64_t>(units.size(), fMiddleSize - position)));
+    }
+    return std::string_view(fEnd).substr(static_cast<std::size_t>(position - fMiddleSize));
 }
 
 std::size_t TGeneratedText::Pull(char* buffer, std::size_t size)
 {
-    const std::size_t count = static_cast<std::size_t>(std::min<std::uint64_t>(size, GetLength() - fPulled));
-    for (std::size_t i = 0; i < count; ++i)
-        buffer[i] = At(fPulled + i);
-    fPulled += count;
+    std::size_t count = 0;
+    while (count < size && fPulled < GetLength()) {
+        const std::size_t copied = At(fPulled).copy(buffer + count, size - count);
+        count += copied;
+        fPulled += copied;
+    }
     return count;
 }
 

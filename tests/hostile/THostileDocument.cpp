@@ -8,6 +8,7 @@
 #include "host/TXmlParser.h"
 #include "spec/TDiffClassRules.h"
 #include "spec/TDiffXMLParser.h"
+#include "tests/hostile/TMemoryMeter.h"
 
 namespace NORVZEL20 {
 
@@ -48,6 +49,14 @@ std::string TellRefusal(const TZELException& error, const TLogRecorder& log)
     return told;
 }
 
+template <class TRead>
+TReading Measure(TRead read)
+{
+    const TMemoryMeter meter;
+    const std::string told = read();
+    return {told, meter.GetPeak(), meter.GetTotal()};
+}
+
 }  // namespace
 
 std::string THostileDocument::Encoded(const std::string& beginning, const std::string& end) const
@@ -56,44 +65,50 @@ std::string THostileDocument::Encoded(const std::string& beginning, const std::s
     return encode == nullptr ? whole : encode(whole);
 }
 
-std::string THostileDocument::ReadByParser() const
+TReading THostileDocument::ReadByParser() const
 {
     std::string text = Encoded("<r>", "</r>");
-    TPlainParser parser;
-    parser.Parse(text.data(), text.size());
-    return parser.Tell();
+    return Measure([&text] {
+        TPlainParser parser;
+        parser.Parse(text.data(), text.size());
+        return parser.Tell();
+    });
 }
 
-std::string THostileDocument::LoadByPopulator() const
+TReading THostileDocument::LoadByPopulator() const
 {
     const std::string text = Encoded("<CIM CIMVERSION=\"2.0\" DTDVERSION=\"2.0\"><DECLARATION><DECLGROUP><VALUE.OBJECT>"
                                      "<INSTANCE CLASSNAME=\"Device\"><PROPERTY NAME=\"Id\" TYPE=\"string\"><VALUE>",
                                      "</VALUE></PROPERTY></INSTANCE></VALUE.OBJECT></DECLGROUP></DECLARATION></CIM>");
     const boost::shared_ptr<TInMemNamespace> ns = LoadSample();
-    TCimXmlPopulator populator(ns);
-    populator.KeepElements();
-    try {
-        populator.LoadFromMemory(text.data(), text.size(), "hostile.xml");
-    } catch (const TPopulateError& error) {
-        return error.what();
-    }
-    const auto instance = boost::dynamic_pointer_cast<ICIMInstance>(populator.TakeElements().at(0));
-    return "loaded '" + instance->GetProperty("Id", TCallContext())->GetValue(TCallContext()).ToText() + "'";
+    return Measure([&text, &ns]() -> std::string {
+        TCimXmlPopulator populator(ns);
+        populator.KeepElements();
+        try {
+            populator.LoadFromMemory(text.data(), text.size(), "hostile.xml");
+        } catch (const TPopulateError& error) {
+            return error.what();
+        }
+        const auto instance = boost::dynamic_pointer_cast<ICIMInstance>(populator.TakeElements().at(0));
+        return "loaded '" + instance->GetProperty("Id", TCallContext())->GetValue(TCallContext()).ToText() + "'";
+    });
 }
 
-std::string THostileDocument::ReadAsSpecification() const
+TReading THostileDocument::ReadAsSpecification() const
 {
     std::string text =
         Encoded("<DifftoolSpec><class name=\"Device\"><includelist><value>", "</value></includelist></class></DifftoolSpec>");
     const boost::shared_ptr<ICIMNamespace> schema = LoadSample();
-    TLogRecorder log;
-    try {
-        TCIMDiffEngine::TDiffXMLParser parser(schema);
-        parser.Parse(text.data(), text.size());
-        return TellRules(parser.getRuleset());
-    } catch (const TZELException& error) {
-        return TellRefusal(error, log);
-    }
+    return Measure([&text, &schema] {
+        TLogRecorder log;
+        try {
+            TCIMDiffEngine::TDiffXMLParser parser(schema);
+            parser.Parse(text.data(), text.size());
+            return TellRules(parser.getRuleset());
+        } catch (const TZELException& error) {
+            return TellRefusal(error, log);
+        }
+    });
 }
 
 }  // namespace NORVZEL20

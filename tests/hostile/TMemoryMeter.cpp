@@ -3,6 +3,9 @@
 #include <malloc.h>
 
 #include <atomic>
+#include <cerrno>
+#include <cstdlib>
+#include <stdexcept>
 
 #if defined(__has_feature)
 #if __has_feature(address_sanitizer) || __has_feature(thread_sanitizer)
@@ -17,34 +20,40 @@ namespace NORVZEL20 {
 
 namespace {
 
-std::atomic<std::size_t> inUse{0};
-std::atomic<std::size_t> peak{0};
+// Below zero where what was there before counting began is freed.
+std::atomic<std::ptrdiff_t> inUse{0};
+std::atomic<std::ptrdiff_t> peak{0};
 std::atomic<std::size_t> total{0};
 
 void Gain(std::size_t size)
 {
     total += size;
-    const std::size_t now = inUse += size;
-    std::size_t most = peak;
+    const auto gained = static_cast<std::ptrdiff_t>(size);
+    const std::ptrdiff_t now = inUse.fetch_add(gained) + gained;
+    std::ptrdiff_t most = peak;
     while (most < now && !peak.compare_exchange_weak(most, now)) {
     }
 }
 
 void Lose(std::size_t size)
 {
-    inUse -= size;
+    inUse -= static_cast<std::ptrdiff_t>(size);
 }
 
 }  // namespace
 
+static bool IsCounting();
+
 TMemoryMeter::TMemoryMeter() : fInUseAtStart(inUse), fTotalAtStart(total)
 {
+    if (!IsCounting())
+        throw std::logic_error("no memory is counted");
     peak = fInUseAtStart;
 }
 
 std::size_t TMemoryMeter::GetPeak() const
 {
-    return peak - fInUseAtStart;
+    return static_cast<std::size_t>(peak - fInUseAtStart);
 }
 
 std::size_t TMemoryMeter::GetTotal() const
@@ -77,13 +86,24 @@ const int hooksInstalled = __sanitizer_install_malloc_and_free_hooks(OnMalloc, O
 
 }  // namespace
 
+static bool NORVZEL20::IsCounting()
+{
+    return hooksInstalled != 0;
+}
+
 #else
+
+static bool NORVZEL20::IsCounting()
+{
+    return true;
+}
 
 extern "C" {
 
 void* __libc_malloc(std::size_t size);
 void* __libc_calloc(std::size_t count, std::size_t size);
 void* __libc_realloc(void* block, std::size_t size);
+void* __libc_memalign(std::size_t alignment, std::size_t size);
 void __libc_free(void* block);
 
 void* malloc(std::size_t size)
@@ -109,6 +129,24 @@ void* realloc(void* block, std::size_t size)
         NORVZEL20::Gain(malloc_usable_size(moved));
     }
     return moved;
+}
+
+void* memalign(std::size_t alignment, std::size_t size)
+{
+    void* block = __libc_memalign(alignment, size);
+    NORVZEL20::Gain(malloc_usable_size(block));
+    return block;
+}
+
+void* aligned_alloc(std::size_t alignment, std::size_t size)
+{
+    return memalign(alignment, size);
+}
+
+int posix_memalign(void** place, std::size_t alignment, std::size_t size)
+{
+    *place = memalign(alignment, size);
+    return *place == nullptr ? ENOMEM : 0;
 }
 
 void free(void* block)

@@ -9,7 +9,7 @@ namespace NORVZEL20 {
 /// Replaces the C library's malloc in the test program, or asks the sanitizer that has replaced it already.
 class TMemoryMeter {
   public:
-    /// Counts from now on.
+    /// Counts from now on. Errors: std::logic_error where the sanitizer tells nothing, so that no bound holds for want of counting.
     TMemoryMeter();
 
     /// The most bytes that were in use at a time, beyond those at the start.
@@ -18,7 +18,7 @@ class TMemoryMeter {
     std::size_t GetTotal() const;
 
   private:
-    std::size_t fInUseAtStart;
+    std::ptrdiff_t fInUseAtStart;
     std::size_t fTotalAtStart;
 };
 

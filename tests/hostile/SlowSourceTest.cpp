@@ -1,0 +1,153 @@
+// Sources that deliver little at a time: what the XML library looks at stays in proportion to the document's length.
+#include <gmock/gmock.h>
+
+#include <algorithm>
+#include <set>
+#include <stdexcept>
+
+#include "embedded/TCimXmlPopulator.h"
+#include "fuzz/SampleInventory.h"
+#include "tests/hostile/TGeneratedText.h"
+#include "tests/hostile/TMemoryMeter.h"
+#include "tests/hostile/TScanMeter.h"
+
+namespace NORVZEL20 {
+
+namespace {
+
+constexpr std::uint64_t kMegabyte = 1u << 20;
+
+const std::string kGroup = "<CIM CIMVERSION=\"2.0\" DTDVERSION=\"2.0\"><DECLARATION><DECLGROUP>";
+const std::string kEnd = "</DECLGROUP></DECLARATION></CIM>";
+
+/// Loads documents that come in pieces of at most so many bytes.
+class SlowSourceTest : public testing::Test {
+  protected:
+    std::string Load(TGeneratedText text, std::size_t piece)
+    {
+        const boost::shared_ptr<TInMemNamespace> ns = LoadSample();
+        fCallsAfterEnd = 0;
+        const auto source = [this, &text, piece](char* buffer, std::size_t size) {
+            fCallsAfterEnd += text.GetPulled() == text.GetLength() ? 1U : 0U;
+            return text.Pull(buffer, std::min(size, piece));
+        };
+        const TScanMeter scan;
+        const TMemoryMeter memory;
+        std::string outcome = "loaded";
+        try {
+            TCimXmlPopulator(ns).LoadFromSource(source, "slow.xml");
+        } catch (const TPopulateError& error) {
+            outcome = error.what();
+        }
+        fLength = text.GetLength();
+        fPulled = text.GetPulled();
+        fScanned = scan.GetScanned();
+        fGiven = scan.GetGiven();
+        fTotal = memory.GetTotal();
+        EXPECT_LE(fCallsAfterEnd, 1U);
+        return outcome;
+    }
+
+    std::uint64_t fLength = 0;
+    std::uint64_t fPulled = 0;
+    std::uint64_t fScanned = 0;
+    std::uint64_t fGiven = 0;
+    std::uint64_t fTotal = 0;
+    std::size_t fCallsAfterEnd = 0;
+};
+
+/// A document in which something goes on for so many megabytes.
+struct TLongRow {
+    const char* name;
+    std::string beginning;
+    std::string end;
+
+    TGeneratedText Make(std::uint64_t megabytes) const { return {beginning, "0123456789abcdef", megabytes * kMegabyte / 16, end}; }
+};
+
+std::vector<TLongRow> LongRows()
+{
+    const std::string value = kGroup + "<VALUE.OBJECT><INSTANCE CLASSNAME=\"Device\"><PROPERTY NAME=\"Id\" TYPE=\"string\"><VALUE>";
+    const std::string valueEnd = "</VALUE></PROPERTY></INSTANCE></VALUE.OBJECT>" + kEnd;
+    return {
+        {"a comment", kGroup + "<!--", "-->" + kEnd},
+        {"an instruction", kGroup + "<?x ", "?>" + kEnd},
+        {"a comment before the document", "<!--", "-->" + kGroup + kEnd},
+        {"a comment behind the document", kGroup + kEnd + "<!--", "-->"},
+        {"a declaration", "<!DOCTYPE CIM [<!ENTITY e \"", "\">]>" + kGroup + kEnd},
+        {"a default", "<!DOCTYPE CIM [<!ATTLIST x a CDATA \"", "\">]>" + kGroup + kEnd},
+        {"an attribute", "<CIM CIMVERSION=\"2.0\" DTDVERSION=\"2.0\" x=\"", "\"><DECLARATION><DECLGROUP>" + kEnd},
+        {"a text", value, valueEnd},
+        {"a section", value + "<![CDATA[", "]]>" + valueEnd},
+    };
+}
+
+}  // namespace
+
+/// Whatever goes on, the library looks at each byte a few times, however small the pieces and however long the document.
+TEST_F(SlowSourceTest, WhatGoesOnIsNotBegunAnewForEachPiece)
+{
+    for (const TLongRow& row : LongRows())
+        for (const std::uint64_t megabytes : {1, 4, 15}) {
+            SCOPED_TRACE(row.name + (" of megabytes: " + std::to_string(megabytes)));
+            EXPECT_EQ("loaded", Load(row.Make(megabytes), 1000));
+            EXPECT_EQ(fLength, fGiven);
+            EXPECT_LE(fScanned, 4 * fLength);
+            EXPECT_LE(fTotal, 12 * fLength + kMegabyte);  // buffers double, and the old one is copied
+        }
+}
+
+TEST_F(SlowSourceTest, WhatNeverEndsIsRefusedAtItsLimit)
+{
+    EXPECT_EQ("slow.xml:1:64: found malformed XML: a tag is too long", Load(LongRows().front().Make(1024), 1000));
+    EXPECT_LE(fPulled, 34 * kMegabyte);
+    EXPECT_LE(fScanned, 3 * fPulled);
+}
+
+/// A terminal would ask its user to end the document again.
+TEST_F(SlowSourceTest, TheEndIsAskedForOnce)
+{
+    for (const std::size_t piece : {std::size_t{1}, std::size_t{1000}, std::size_t{kMegabyte}})
+        for (const std::uint64_t length : {kMegabyte / 4 - 1, kMegabyte / 4, kMegabyte / 4 + 1, kMegabyte}) {
+            SCOPED_TRACE(std::to_string(length) + " bytes in pieces of " + std::to_string(piece));
+            EXPECT_EQ("loaded", Load({kGroup, " ", length - kGroup.size() - kEnd.size(), kEnd}, piece));
+            EXPECT_EQ(length, fGiven);
+            EXPECT_EQ(1U, fCallsAfterEnd);
+        }
+}
+
+/// What is parsed at a time ends within tags, characters, line ends and references, one shift after the other.
+TEST_F(SlowSourceTest, APieceMayEndAnywhere)
+{
+    const std::string object =
+        "<!-- \xE2\x82\xAC --><VALUE.OBJECT>\r\n<INSTANCE CLASSNAME='Device'><PROPERTY NAME='Id' TYPE='string'><VALUE>"
+        "\xC3\xBC&amp;\r\n&#233;<![CDATA[<]]></VALUE></PROPERTY></INSTANCE></VALUE.OBJECT>";
+    std::set<std::string> results;
+    for (std::size_t shift = 0; shift <= object.size(); ++shift) {
+        const std::string blanks(kMegabyte / 4 - kGroup.size() - shift, ' ');
+        const boost::shared_ptr<TInMemNamespace> ns = LoadSample();
+        TGeneratedText text(kGroup + blanks, object, 1, kEnd);
+        TCimXmlPopulator(ns).LoadFromSource([&text](char* buffer, std::size_t size) { return text.Pull(buffer, size); }, "s");
+        results.insert(WriteDocument(*ns));
+    }
+    ASSERT_EQ(1U, results.size());
+    EXPECT_THAT(*results.begin(), testing::HasSubstr("<VALUE>\xC3\xBC&amp;\n\xC3\xA9&lt;</VALUE>"));
+}
+
+TEST_F(SlowSourceTest, ASourceThatFailsLateLeavesNothing)
+{
+    const boost::shared_ptr<TInMemNamespace> ns = LoadSample();
+    const std::string before = WriteDocument(*ns);
+    const std::string added =
+        "<VALUE.OBJECT><CLASS NAME='New'/></VALUE.OBJECT><VALUE.OBJECT><INSTANCE CLASSNAME='New'/></VALUE.OBJECT>";
+    TGeneratedText text(kGroup + added, "<!-- more to come -->\n", kMegabyte, kEnd);
+    const TScanMeter scan;
+    const auto source = [&text](char* buffer, std::size_t size) {
+        return text.GetPulled() < kMegabyte ? text.Pull(buffer, size) : throw std::out_of_range("the source's own");
+    };
+    EXPECT_THROW(TCimXmlPopulator(ns).LoadFromSource(source, "slow.xml"), std::out_of_range);
+    EXPECT_EQ(kMegabyte, scan.GetGiven());
+    EXPECT_EQ(before, WriteDocument(*ns));
+}
+
+}  // namespace NORVZEL20
