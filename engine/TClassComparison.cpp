@@ -1,6 +1,6 @@
 #include "engine/TClassComparison.h"
 
-#include <sstream>
+#include <string>
 #include <utility>
 
 #include "engine/TCompareInstances.h"
@@ -106,10 +106,8 @@ bool TCIMDiffEngine::TClassComparison::FindClassIn(std::size_t index)
 
 void TCIMDiffEngine::TClassComparison::FailWithoutClassIn(std::size_t index) const
 {
-    std::ostringstream text;
-    text << "TCIMDiffEngine: Schema do not match. (Couldn't find class " << fClassName << " in namespace " << index << ")"
-         << std::endl;
-    TRootObject::GetCoreLogger()->Log(0, text.str());
+    TRootObject::GetCoreLogger()->Log(0, "TCIMDiffEngine: Schema do not match. (Couldn't find class " + fClassName +
+                                             " in namespace " + std::to_string(index) + ")\n");
     throw TZELException(TZELStatusCode::kSchemaMismatch);
 }
 

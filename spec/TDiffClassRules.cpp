@@ -1,10 +1,16 @@
 #include "spec/TDiffClassRules.h"
 
 #include <algorithm>
-#include <sstream>
 #include <utility>
 
 namespace NORVZEL20 {
+
+namespace {
+
+/// What a formatted read of words skips.
+const char kWhiteSpace[] = " \t\n\v\f\r";
+
+}  // namespace
 
 TCIMDiffEngine::TDiffClassRules::TDiffClassRules() : fDefault(EXCLUDE), fFinal(false) {}
 
@@ -23,9 +29,12 @@ void TCIMDiffEngine::TDiffClassRules::updateRules(boost::shared_ptr<TDiffClassRu
 
 void TCIMDiffEngine::TDiffClassRules::excludeKeys(std::string list)
 {
-    std::istringstream words(list);
-    for (std::string word; words >> word;) {
-        fExcludedKeys.push_back(word);
+    // By hand: a stream takes a lack of memory for its end, and the names that follow would be lost without a word.
+    std::size_t begin = list.find_first_not_of(kWhiteSpace);
+    while (begin != std::string::npos) {
+        const std::size_t end = std::min(list.find_first_of(kWhiteSpace, begin), list.size());
+        fExcludedKeys.push_back(list.substr(begin, end - begin));
+        begin = list.find_first_not_of(kWhiteSpace, end);
     }
 }
 

@@ -1,7 +1,7 @@
 #include "spec/TDiffXMLParser.h"
 
 #include <boost/smart_ptr/make_shared.hpp>
-#include <sstream>
+#include <string>
 #include <utility>
 
 #include "host/TRootObject.h"
@@ -50,9 +50,8 @@ void TCIMDiffEngine::TDiffXMLParser::notationDecl(const char*, const char*, cons
 
 void TCIMDiffEngine::TDiffXMLParser::FatalError(const char* message)
 {
-    std::ostringstream text;
-    text << "Diff-XML Parser line " << GetCurLine() << ":" << message;
-    TRootObject::GetCoreLogger()->Log(0, text.str());
+    // No stream puts the text together: it would lose the rest of it where memory is short.
+    TRootObject::GetCoreLogger()->Log(0, "Diff-XML Parser line " + std::to_string(GetCurLine()) + ":" + message);
     throw TZELException(TZELStatusCode::kParseError);
 }
 
@@ -63,9 +62,7 @@ TCIMDiffEngine::TRuleset TCIMDiffEngine::TDiffXMLParser::getRuleset()
 
 void TCIMDiffEngine::TDiffXMLParser::PassOn(const char* event, const TZELException& error)
 {
-    std::ostringstream text;
-    text << event << error.what() << " on line " << GetCurLine();
-    TRootObject::GetCoreLogger()->Log(0, text.str());
+    TRootObject::GetCoreLogger()->Log(0, std::string(event) + error.what() + " on line " + std::to_string(GetCurLine()));
     throw TZELException(error.GetStatusCode());
 }
 

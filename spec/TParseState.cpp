@@ -1,6 +1,6 @@
 #include "spec/TParseState.h"
 
-#include <sstream>
+#include <string>
 #include <utility>
 
 namespace NORVZEL20 {
@@ -36,9 +36,7 @@ void TCIMDiffEngine::TDiffXMLParser::TParseState::HandleAttrsOfTop(TDiffXMLParse
 void TCIMDiffEngine::TDiffXMLParser::TParseState::FailOnLine(TDiffXMLParser& parser, const std::string& what,
                                                              const std::string& then)
 {
-    std::ostringstream text;
-    text << what << parser.GetCurLine() << then << std::endl;
-    parser.FatalError(text.str().c_str());
+    parser.FatalError((what + std::to_string(parser.GetCurLine()) + then + "\n").c_str());
 }
 
 }  // namespace NORVZEL20

@@ -5,6 +5,7 @@
 
 #include "tests/faults/DifferingNamespaces.h"
 #include "tests/faults/TFaultyRun.h"
+#include "tests/faults/TraceRecords.h"
 #include "tests/support/TCapturingLogger.h"
 #include "tests/support/TComparisonRun.h"
 #include "tests/support/TTestAccess.h"

@@ -6,6 +6,7 @@
 
 #include "host/TAddToVectorCallback.h"
 #include "tests/faults/DifferingNamespaces.h"
+#include "tests/faults/TraceRecords.h"
 #include "tests/support/Dump.h"
 #include "tests/support/TComparisonRun.h"
 #include "tests/support/TTestAccess.h"
