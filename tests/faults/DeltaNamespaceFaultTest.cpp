@@ -76,8 +76,8 @@ class TReadSpecification : public IFaultyAction {
   private:
     const std::string kExpected = "Disk include Note:EXCLUDE\n"
                                   "Ghost include Note:EXCLUDE\n"
-                                  "Slot exclude Peer:INCLUDE State:INCLUDE -BusOfTheEnclosure -ShelfOfTheEnclosure\n"
-                                  "Ssd exclude final Note:EXCLUDE Wear:INCLUDE\n";
+                                  "Slot exclude Peer:INCLUDE Uplink:INCLUDE -BusOfTheEnclosure -ShelfOfTheEnclosure\n"
+                                  "Ssd exclude final Mirror:INCLUDE Note:EXCLUDE Wear:INCLUDE\n";
     const std::string& fPath;
     std::vector<boost::shared_ptr<ICIMNamespace>> fNamespaces = {MakeDiffering(0)};
     TCIMDiffEngine fEngine{MakeDeltaNamespace(EHost::kInmem), fNamespaces, ""};

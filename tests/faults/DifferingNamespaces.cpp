@@ -14,8 +14,6 @@ using EType = TCIMValue::TCIMType::ECIMType;
 
 const TCallContext kNone;
 const char* const kClasses[] = {"Disk", "Ssd", "Slot"};
-const unsigned short kSameNumber = 1;
-const unsigned short kOtherPeer = 2;
 
 void DeclareDiffering(TNamespaceBuilder& builder, std::size_t index, EFlaw flaw)
 {
@@ -28,8 +26,8 @@ void DeclareDiffering(TNamespaceBuilder& builder, std::size_t index, EFlaw flaw)
     std::vector<TNamespaceBuilder::TProperty> ofSlot = {key("BusOfTheEnclosure", EType::kString),
                                                         key("ShelfOfTheEnclosure", EType::kUint8), key("Number", EType::kUint16),
                                                         property("Peer", EType::kReference)};
-    if (flaw != EFlaw::kNoStateOfSlots) {
-        ofSlot.push_back(property("State", EType::kString));
+    if (flaw != EFlaw::kNoUplinkOfSlots) {
+        ofSlot.push_back(property("Uplink", EType::kReference));
     }
     if (flaw != EFlaw::kNoSlots) {
         builder.Class("Slot", "", ofSlot);
@@ -53,16 +51,16 @@ void FillDisks(TNamespaceBuilder& builder, std::size_t index)
     const std::string own = std::to_string(index);
     builder.Instance("Disk", {{"Id", "common"},
                               {"Size", 100 + number},
-                              {"Mirror", index == 0 ? TCIMValue::Null(EType::kReference) : PathOfDisk("same")},
+                              {"Mirror", PathOfDisk(index == 0 ? "solid" : "lone")},
                               {"Note", "a note that is too long to be held inside, number " + own},
                               {"DateTimeOfCollection", own}});
-    builder.Instance("Disk", {{"Id", "moved"}, {"Size", 7u}, {"Mirror", PathOfDisk(index == 0 ? "common" : "same")}});
-    builder.Instance("Disk", {{"Id", "same"}, {"Size", 7u}, {"Mirror", PathOfDisk("common")}});
-    builder.Instance("Ssd", {{"Id", "solid"}, {"Size", 9 + number}, {"Wear", static_cast<unsigned char>(index)}});
+    builder.Instance("Disk", {{"Id", "lone"}, {"Mirror", index == 0 ? TCIMValue::Null(EType::kReference) : PathOfDisk("common")}});
+    builder.Instance(
+        "Ssd", {{"Id", "solid"}, {"Size", number}, {"Mirror", PathOfDisk("lone")}, {"Wear", static_cast<unsigned char>(index)}});
     if (index == 0) {
         builder.Instance("Disk", {{"Id", "only in the reference, alas"}, {"Size", 1u}});
     } else {
-        builder.Instance("Disk", {{"Id", "not in the reference, alas"}, {"Size", 2u}, {"Mirror", PathOfDisk("same")}});
+        builder.Instance("Disk", {{"Id", "not in the reference, alas"}, {"Size", 2u}, {"Mirror", PathOfDisk("lone")}});
     }
 }
 
@@ -84,24 +82,17 @@ TCIMValue PathOfSlot(std::size_t index, unsigned short number)
     return TCIMValue(path);
 }
 
-void AddSlot(TNamespaceBuilder& builder, std::size_t index, unsigned short number, const std::string& state, const TCIMValue& peer,
-             EFlaw flaw)
-{
-    TNamespaceBuilder::TValues values = KeysOfSlot(index, number);
-    values.emplace_back("Peer", peer);
-    if (flaw != EFlaw::kNoStateOfSlots) {
-        values.emplace_back("State", state);
-    }
-    builder.Instance("Slot", values);
-}
-
-/// The first slot's peer is the same but for its bus and shelf.
+/// One slot whose peer differs by its bus and shelf alone, and whose uplink differs by its number; and one more.
 void FillSlots(TNamespaceBuilder& builder, std::size_t index, EFlaw flaw)
 {
     const auto own = static_cast<unsigned short>(10 + index);
-    AddSlot(builder, index, kSameNumber, std::to_string(index), PathOfSlot(index, kOtherPeer), flaw);
-    AddSlot(builder, index, kOtherPeer, "ready", PathOfSlot(index, index == 0 ? kSameNumber : kOtherPeer), flaw);
-    AddSlot(builder, index, own, "only here", TCIMValue::Null(EType::kReference), flaw);
+    TNamespaceBuilder::TValues values = KeysOfSlot(index, 1);
+    values.emplace_back("Peer", PathOfSlot(index, 1));
+    if (flaw != EFlaw::kNoUplinkOfSlots) {
+        values.emplace_back("Uplink", PathOfSlot(0, own));
+    }
+    builder.Instance("Slot", values);
+    builder.Instance("Slot", KeysOfSlot(index, own));
 }
 
 void CopyInstances(TNamespaceBuilder& builder, ICIMNamespace& from, const std::string& className)
@@ -144,9 +135,9 @@ std::string RulesForDiffering(bool excludesKeys, EFlaw flaw)
     const std::string unknown = flaw == EFlaw::kUnknownProperty ? "<value>a property that nothing has</value>" : "";
     return "<?xml version='1.0'?>\n<DifftoolSpec version='1.0'>\n"
            "<class name='Disk' default='include'><excludelist><value>Note</value></excludelist></class>\n"
-           "<class name='Ssd'><includelist><value>Wear</value></includelist></class>\n"
+           "<class name='Ssd'><includelist><value>Wear</value><value>Mirror</value></includelist></class>\n"
            "<class name='Slot'" +
-           excluded + "><includelist><value>State</value><value>Peer</value>" + unknown +
+           excluded + "><includelist><value>Peer</value><value>Uplink</value>" + unknown +
            "</includelist></class>\n</DifftoolSpec>\n";
 }
 

@@ -14,7 +14,7 @@ namespace NORVZEL20 {
 enum class EFlaw {
     kNone,
     kNoSlots,          ///< the last namespace lacks the class Slot: status 37 after the records of disks
-    kNoStateOfSlots,   ///< its slots lack the property State: what the host answers, after the same records
+    kNoUplinkOfSlots,  ///< its slots lack the property Uplink: status 15, the host's answer, after the same records
     kUnknownProperty,  ///< the specification names a property that nothing has: status 9 before any record
 };
 

@@ -62,8 +62,8 @@ class SpecificationFile : public testing::Test {
     const std::string kContents = RulesForDiffering(true);
     const std::string kRules = "Disk include Note:EXCLUDE\n"
                                "Ghost include Note:EXCLUDE\n"
-                               "Slot exclude Peer:INCLUDE State:INCLUDE -BusOfTheEnclosure -ShelfOfTheEnclosure\n"
-                               "Ssd exclude final Note:EXCLUDE Wear:INCLUDE\n";
+                               "Slot exclude Peer:INCLUDE Uplink:INCLUDE -BusOfTheEnclosure -ShelfOfTheEnclosure\n"
+                               "Ssd exclude final Mirror:INCLUDE Note:EXCLUDE Wear:INCLUDE\n";
     TCapturingLogger fLog;
     TScratchFile fFile{kContents};
     std::string fRules;

@@ -1,9 +1,9 @@
 #include <gtest/gtest.h>
 
-#include <filesystem>
 #include <iostream>
 
 #include "embedded/TCoreLog.h"
+#include "tests/faults/LeakCheck.h"
 #include "tests/faults/TFailingAllocator.h"
 #include "tests/faults/TraceRecords.h"
 #include "tests/longrun/TRecordWriter.h"
@@ -31,11 +31,6 @@ class TQuietLogger : public ILogger {
   private:
     ILogger* fBefore;
 };
-
-std::ptrdiff_t CountOpenFiles()
-{
-    return std::distance(std::filesystem::directory_iterator("/proc/self/fd"), std::filesystem::directory_iterator());
-}
 
 std::size_t CountInstances(TDeltaNamespace& delta, const std::string& className)
 {
