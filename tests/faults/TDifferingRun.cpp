@@ -137,7 +137,8 @@ void ExpectThatAnotherRunIsWhole(const TDiffering& differing, const TCompared& c
     const TUntouchedRun expected = untouched.before == left ? untouched : RunOverCopy(differing, compared.reference);
     EXPECT_EQ(expected.before, left);
     const TTexts before = TraceRecords(compared.store);
-    const std::string aliases = Together(DumpAliases(*compared.delta), expected.aliases);
+    const std::string aliasesLeft = DumpAliases(*compared.delta);
+    EXPECT_EQ(Together(untouched.aliases, ""), Together(untouched.aliases, aliasesLeft));
 
     TCapturingLogger log;
     EXPECT_EQ(expected.outcome, OutcomeOf([&compared] { compared.delta->FindDifferences(); }));
@@ -145,7 +146,7 @@ void ExpectThatAnotherRunIsWhole(const TDiffering& differing, const TCompared& c
     TTexts all = before;
     all.insert(all.end(), expected.records.begin(), expected.records.end());
     EXPECT_EQ(all, TraceRecords(compared.store));
-    EXPECT_EQ(aliases, Together(DumpAliases(*compared.delta), ""));
+    EXPECT_EQ(Together(aliasesLeft, expected.aliases), Together(DumpAliases(*compared.delta), ""));
     const std::string reference = DumpDiffering(compared.reference);
     EXPECT_EQ(expected.reference, reference);
     EXPECT_EQ(untouched.reference, reference);
