@@ -57,6 +57,9 @@ INSTANTIATE_TEST_SUITE_P(Faults, RunOutOfMemory, testing::ValuesIn(TDiffering::A
 
 INSTANTIATE_TEST_SUITE_P(FaultsOfFlawed, RunOutOfMemory,
                          testing::Values(TDiffering{EHost::kInmem, 3, true, EFlaw::kNoSlots},
+                                         TDiffering{EHost::kPlain, 2, false, EFlaw::kNoSlots},
+                                         TDiffering{EHost::kPlain, 3, true, EFlaw::kNoUplinkOfSlots},
+                                         TDiffering{EHost::kPlain, 3, false, EFlaw::kUnknownProperty},
                                          TDiffering{EHost::kInmem, 2, true, EFlaw::kNoUplinkOfSlots},
                                          TDiffering{EHost::kInmem, 2, true, EFlaw::kUnknownProperty}),
                          NameOf);
