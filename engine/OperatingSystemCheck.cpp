@@ -1,3 +1,5 @@
+#include <string>
+
 #include "engine/TCIMDiffEngine.h"
 #include "host/TAddToVectorCallback.h"
 #include "host/TRootObject.h"
@@ -21,6 +23,8 @@ unsigned short AppendOperatingSystems(ICIMNamespace& ns, std::vector<boost::shar
 
 void TCIMDiffEngine::CheckOperatingSystems()
 {
+    // Made beforehand, so that a check that fails for lack of memory can still be told.
+    const std::string failed = "TCIMDiffEngine: Failed to get all properties to check Schema match\n";
     try {
         std::vector<boost::shared_ptr<ICIMInstance>> systems;
         const unsigned short referenceType = AppendOperatingSystems(*namespaces.at(0), systems);
@@ -31,7 +35,7 @@ void TCIMDiffEngine::CheckOperatingSystems()
             }
         }
     } catch (...) {
-        TRootObject::GetCoreLogger()->Log(0, "TCIMDiffEngine: Failed to get all properties to check Schema match\n");
+        TRootObject::GetCoreLogger()->Log(0, failed);
         throw TZELException(TZELStatusCode::kInitializationFailed);
     }
 }

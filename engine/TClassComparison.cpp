@@ -1,9 +1,10 @@
 #include "engine/TClassComparison.h"
 
-#include <sstream>
+#include <string>
 #include <utility>
 
 #include "engine/TCompareInstances.h"
+#include "engine/TMessageStream.h"
 #include "host/TAddToVectorCallback.h"
 #include "host/TRootObject.h"
 #include "host/TZELException.h"
@@ -107,7 +108,7 @@ bool TCIMDiffEngine::TClassComparison::FindClassIn(std::size_t index)
 
 void TCIMDiffEngine::TClassComparison::FailWithoutClassIn(std::size_t index) const
 {
-    std::ostringstream text;
+    TMessageStream text;
     text << "TCIMDiffEngine: Schema do not match. (Couldn't find class " << fClassName << " in namespace " << index << ")"
          << std::endl;
     TRootObject::GetCoreLogger()->Log(0, text.str());

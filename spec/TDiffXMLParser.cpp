@@ -1,9 +1,9 @@
 #include "spec/TDiffXMLParser.h"
 
 #include <boost/smart_ptr/make_shared.hpp>
-#include <sstream>
 #include <utility>
 
+#include "engine/TMessageStream.h"
 #include "host/TRootObject.h"
 #include "spec/TStateStart.h"
 
@@ -50,7 +50,7 @@ void TCIMDiffEngine::TDiffXMLParser::notationDecl(const char*, const char*, cons
 
 void TCIMDiffEngine::TDiffXMLParser::FatalError(const char* message)
 {
-    std::ostringstream text;
+    TMessageStream text;
     text << "Diff-XML Parser line " << GetCurLine() << ":" << message;
     TRootObject::GetCoreLogger()->Log(0, text.str());
     throw TZELException(TZELStatusCode::kParseError);
@@ -63,7 +63,7 @@ TCIMDiffEngine::TRuleset TCIMDiffEngine::TDiffXMLParser::getRuleset()
 
 void TCIMDiffEngine::TDiffXMLParser::PassOn(const char* event, const TZELException& error)
 {
-    std::ostringstream text;
+    TMessageStream text;
     text << event << error.what() << " on line " << GetCurLine();
     TRootObject::GetCoreLogger()->Log(0, text.str());
     throw TZELException(error.GetStatusCode());

@@ -1,7 +1,8 @@
 #include "spec/TParseState.h"
 
-#include <sstream>
 #include <utility>
+
+#include "engine/TMessageStream.h"
 
 namespace NORVZEL20 {
 
@@ -36,7 +37,7 @@ void TCIMDiffEngine::TDiffXMLParser::TParseState::HandleAttrsOfTop(TDiffXMLParse
 void TCIMDiffEngine::TDiffXMLParser::TParseState::FailOnLine(TDiffXMLParser& parser, const std::string& what,
                                                              const std::string& then)
 {
-    std::ostringstream text;
+    TMessageStream text;
     text << what << parser.GetCurLine() << then << std::endl;
     parser.FatalError(text.str().c_str());
 }

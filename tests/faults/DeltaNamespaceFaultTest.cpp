@@ -74,7 +74,10 @@ class TReadSpecification : public IFaultyAction {
     }
 
   private:
-    const std::string kExpected = "Disk include\nGhost include\nSlot exclude State:INCLUDE -Bus\nSsd include\n";
+    const std::string kExpected = "Disk include Note:EXCLUDE\n"
+                                  "Ghost include Note:EXCLUDE\n"
+                                  "Slot exclude Peer:INCLUDE Uplink:INCLUDE -BusOfTheEnclosure -ShelfOfTheEnclosure\n"
+                                  "Ssd exclude final Mirror:INCLUDE Note:EXCLUDE Wear:INCLUDE\n";
     const std::string& fPath;
     std::vector<boost::shared_ptr<ICIMNamespace>> fNamespaces = {MakeDiffering(0)};
     TCIMDiffEngine fEngine{MakeDeltaNamespace(EHost::kInmem), fNamespaces, ""};

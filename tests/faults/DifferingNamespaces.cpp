@@ -1,8 +1,9 @@
 #include "tests/faults/DifferingNamespaces.h"
 
-#include <set>
+#include <vector>
 
 #include "host/TAddToVectorCallback.h"
+#include "host/TZELException.h"
 #include "tests/support/Dump.h"
 
 namespace NORVZEL20 {
@@ -10,7 +11,31 @@ namespace NORVZEL20 {
 namespace {
 
 using EType = TCIMValue::TCIMType::ECIMType;
-using TInstances = std::vector<boost::shared_ptr<ICIMInstance>>;
+
+const TCallContext kNone;
+const char* const kClasses[] = {"Disk", "Ssd", "Slot"};
+
+void DeclareDiffering(TNamespaceBuilder& builder, std::size_t index, EFlaw flaw)
+{
+    const auto property = TNamespaceBuilder::Property;
+    const auto key = TNamespaceBuilder::Key;
+    builder.Class("Disk", "",
+                  {key("Id", EType::kString), property("Size", EType::kUint32), property("Mirror", EType::kReference),
+                   property("Note", EType::kString), property("DateTimeOfCollection", EType::kString)});
+    builder.Class("Ssd", "Disk", {property("Wear", EType::kUint8)});
+    std::vector<TNamespaceBuilder::TProperty> ofSlot = {key("BusOfTheEnclosure", EType::kString),
+                                                        key("ShelfOfTheEnclosure", EType::kUint8), key("Number", EType::kUint16),
+                                                        property("Peer", EType::kReference)};
+    if (flaw != EFlaw::kNoUplinkOfSlots) {
+        ofSlot.push_back(property("Uplink", EType::kReference));
+    }
+    if (flaw != EFlaw::kNoSlots) {
+        builder.Class("Slot", "", ofSlot);
+    }
+    if (index == 0) {
+        builder.Class("Ghost", "Disk", {});
+    }
+}
 
 TCIMValue PathOfDisk(const std::string& id)
 {
@@ -23,145 +48,110 @@ TCIMValue PathOfDisk(const std::string& id)
 void FillDisks(TNamespaceBuilder& builder, std::size_t index)
 {
     const auto number = static_cast<unsigned int>(index);
-    builder.Instance("Disk", {{"Id", "common"}, {"Size", 100 + number}, {"Note", "a note that is too long to be held inside"}});
-    builder.Instance("Disk", {{"Id", "same"}, {"Size", 7u}, {"Mirror", PathOfDisk("common")}});
-    builder.Instance("Ssd", {{"Id", "solid"}, {"Size", 9u}, {"Wear", static_cast<unsigned char>(index)}});
+    const std::string own = std::to_string(index);
+    builder.Instance("Disk", {{"Id", "common"},
+                              {"Size", 100 + number},
+                              {"Mirror", PathOfDisk(index == 0 ? "solid" : "lone")},
+                              {"Note", "a note that is too long to be held inside, number " + own},
+                              {"DateTimeOfCollection", own}});
+    builder.Instance("Disk", {{"Id", "lone"}, {"Mirror", index == 0 ? TCIMValue::Null(EType::kReference) : PathOfDisk("common")}});
+    builder.Instance(
+        "Ssd", {{"Id", "solid"}, {"Size", number}, {"Mirror", PathOfDisk("lone")}, {"Wear", static_cast<unsigned char>(index)}});
     if (index == 0) {
         builder.Instance("Disk", {{"Id", "only in the reference, alas"}, {"Size", 1u}});
     } else {
-        builder.Instance("Disk", {{"Id", "not in the reference, alas"}, {"Size", 2u}, {"Mirror", PathOfDisk("same")}});
+        builder.Instance("Disk", {{"Id", "not in the reference, alas"}, {"Size", 2u}, {"Mirror", PathOfDisk("lone")}});
     }
 }
 
-void FillSlots(TNamespaceBuilder& builder, std::size_t index)
+/// The keys of a slot, of which bus and shelf are those of the namespace.
+TNamespaceBuilder::TValues KeysOfSlot(std::size_t index, unsigned short number)
 {
-    const std::string bus = "a bus with a long name, number " + std::to_string(index);
+    return {{"BusOfTheEnclosure", "a bus with a long name, number " + std::to_string(index)},
+            {"ShelfOfTheEnclosure", static_cast<unsigned char>(index)},
+            {"Number", number}};
+}
+
+TCIMValue PathOfSlot(std::size_t index, unsigned short number)
+{
+    TCIMReference path;
+    path.SetClassName("Slot");
+    for (const auto& [name, value] : KeysOfSlot(index, number)) {
+        path.AddKeyValue(name, value);
+    }
+    return TCIMValue(path);
+}
+
+/// One slot whose peer differs by its bus and shelf alone, and whose uplink differs by its number; and one more.
+void FillSlots(TNamespaceBuilder& builder, std::size_t index, EFlaw flaw)
+{
     const auto own = static_cast<unsigned short>(10 + index);
-    builder.Instance("Slot", {{"Bus", bus}, {"Number", static_cast<unsigned short>(1)}, {"State", std::to_string(index)}});
-    builder.Instance("Slot", {{"Bus", bus}, {"Number", own}, {"State", "only here"}});
+    TNamespaceBuilder::TValues values = KeysOfSlot(index, 1);
+    values.emplace_back("Peer", PathOfSlot(index, 1));
+    if (flaw != EFlaw::kNoUplinkOfSlots) {
+        values.emplace_back("Uplink", PathOfSlot(0, own));
+    }
+    builder.Instance("Slot", values);
+    builder.Instance("Slot", KeysOfSlot(index, own));
 }
 
-TInstances InstancesOf(boost::shared_ptr<ICIMNamespace> ns, const std::string& className)
+void CopyInstances(TNamespaceBuilder& builder, ICIMNamespace& from, const std::string& className)
 {
-    TInstances instances;
-    ns->GetClass(className, TCallContext())
-        ->EnumerateInstances(TAddToVectorCallback<ICIMInstance>(&instances), false, TCallContext());
-    return instances;
+    std::vector<boost::shared_ptr<ICIMInstance>> instances;
+    from.GetClass(className, kNone)->EnumerateInstances(TAddToVectorCallback<ICIMInstance>(&instances), false, kNone);
+    for (const auto& instance : instances) {
+        TNamespaceBuilder::TValues values;
+        const auto append = [&values](boost::shared_ptr<ICIMProperty> property) {
+            values.emplace_back(property->GetPropertyDecl(kNone)->GetName(kNone), property->GetValue(kNone));
+            return true;
+        };
+        instance->EnumerateProperties(append, kNone);
+        builder.Instance(className, values);
+    }
 }
-
-TCIMValue ValueOf(const ICIMInstance& instance, const std::string& name)
-{
-    return instance.GetProperty(name, TCallContext())->GetValue(TCallContext());
-}
-
-std::string PathOf(const ICIMInstance& instance)
-{
-    return instance.GetReference(TCallContext()).GetPath();
-}
-
-std::string RecordText(const ICIMInstance& record)
-{
-    return ValueOf(record, "Type").ToText() + " " + ValueOf(record, "InstanceName").ToText() + " " +
-           ValueOf(record, "Property").ToText() + " " + ValueOf(record, "NamespaceIndices").ToText();
-}
-
-/// Puts the three kinds of records back into the order of writing: a class record stands before the first record that is tied to
-/// it; one that nothing is tied to stands before the loose record, or else the class, that comes next.
-class TTrace {
-  public:
-    explicit TTrace(boost::shared_ptr<ICIMNamespace> store)
-        : fClasses(InstancesOf(store, "KALMO_DeltaClass")), fDeltas(InstancesOf(store, "KALMO_Delta")),
-          fTies(InstancesOf(store, "KALMO_DeltaClassAssocToDelta"))
-    {
-        for (const auto& tie : fTies) {
-            fTiedClasses.insert(ValueOf(*tie, "Class").ToText());
-        }
-    }
-
-    std::vector<std::string> Tell()
-    {
-        for (const auto& delta : fDeltas) {
-            const bool isTied = fTiesTold < fTies.size() && ValueOf(*fTies[fTiesTold], "Delta").ToText() == PathOf(*delta);
-            isTied ? TellClassesUpTo(ValueOf(*fTies[fTiesTold], "Class").ToText()) : TellUntiedClass();
-            fTexts.push_back(RecordText(*delta));
-            if (isTied) {
-                fTexts.push_back("tie");
-                ++fTiesTold;
-            }
-        }
-        TellClassesUpTo("");
-        if (fTiesTold < fTies.size()) {
-            fTexts.push_back("ties of other records");
-        }
-        return fTexts;
-    }
-
-  private:
-    void TellClassesUpTo(const std::string& path)
-    {
-        while (fClassesTold < fClasses.size() && (fClassesTold == 0 || PathOf(*fClasses[fClassesTold - 1]) != path)) {
-            TellClass();
-        }
-    }
-
-    void TellUntiedClass()
-    {
-        if (fClassesTold < fClasses.size() && fTiedClasses.count(PathOf(*fClasses[fClassesTold])) == 0) {
-            TellClass();
-        }
-    }
-
-    void TellClass()
-    {
-        fTexts.push_back("class " + ValueOf(*fClasses[fClassesTold], "ClassName").ToText());
-        ++fClassesTold;
-    }
-
-    TInstances fClasses;
-    TInstances fDeltas;
-    TInstances fTies;
-    std::set<std::string> fTiedClasses;
-    std::size_t fClassesTold = 0;
-    std::size_t fTiesTold = 0;
-    std::vector<std::string> fTexts;
-};
 
 }  // namespace
 
-void FillDiffering(TNamespaceBuilder& builder, std::size_t index)
+void FillDiffering(TNamespaceBuilder& builder, std::size_t index, EFlaw flaw)
 {
-    const auto key = TNamespaceBuilder::Key("Id");
-    const auto size = TNamespaceBuilder::Property("Size", EType::kUint32);
-    const auto mirror = TNamespaceBuilder::Property("Mirror", EType::kReference);
-    builder.Class("Disk", "", {key, size, mirror, TNamespaceBuilder::Property("Note")});
-    builder.Class("Ssd", "Disk", {TNamespaceBuilder::Property("Wear", EType::kUint8)});
-    builder.Class(
-        "Slot", "",
-        {TNamespaceBuilder::Key("Bus"), TNamespaceBuilder::Key("Number", EType::kUint16), TNamespaceBuilder::Property("State")});
-    if (index == 0) {
-        builder.Class("Ghost", "Disk", {});
-    }
+    DeclareDiffering(builder, index, flaw);
     FillDisks(builder, index);
-    FillSlots(builder, index);
+    if (flaw != EFlaw::kNoSlots) {
+        FillSlots(builder, index, flaw);
+    }
 }
 
-std::string RulesForDiffering(bool excludesKeys)
+void FillLike(TNamespaceBuilder& builder, boost::shared_ptr<ICIMNamespace> reference)
 {
-    const std::string excluded = excludesKeys ? " excludekeys='Bus'" : "";
+    DeclareDiffering(builder, 0, EFlaw::kNone);
+    for (const char* const name : kClasses) {
+        CopyInstances(builder, *reference, name);
+    }
+}
+
+std::string RulesForDiffering(bool excludesKeys, EFlaw flaw)
+{
+    const std::string excluded = excludesKeys ? " excludekeys='BusOfTheEnclosure ShelfOfTheEnclosure'" : "";
+    const std::string unknown = flaw == EFlaw::kUnknownProperty ? "<value>a property that nothing has</value>" : "";
     return "<?xml version='1.0'?>\n<DifftoolSpec version='1.0'>\n"
-           "<class name='Disk' default='include'/>\n"
+           "<class name='Disk' default='include'><excludelist><value>Note</value></excludelist></class>\n"
+           "<class name='Ssd'><includelist><value>Wear</value><value>Mirror</value></includelist></class>\n"
            "<class name='Slot'" +
-           excluded + "><includelist><value>State</value></includelist></class>\n</DifftoolSpec>\n";
+           excluded + "><includelist><value>Peer</value><value>Uplink</value>" + unknown +
+           "</includelist></class>\n</DifftoolSpec>\n";
 }
 
 std::string DumpDiffering(boost::shared_ptr<ICIMNamespace> ns)
 {
-    return DumpInstances(ns, "Disk") + DumpInstances(ns, "Ssd") + DumpInstances(ns, "Slot");
-}
-
-std::vector<std::string> TraceRecords(boost::shared_ptr<ICIMNamespace> store)
-{
-    return TTrace(store).Tell();
+    std::string text;
+    for (const char* const name : kClasses) {
+        try {
+            text += DumpInstances(ns, name);
+        } catch (const TZELException& error) {
+            text += std::string("no ") + name + ": " + error.what() + "\n";
+        }
+    }
+    return text;
 }
 
 }  // namespace NORVZEL20

@@ -6,6 +6,7 @@
 #include <new>
 
 #include "host/TZELException.h"
+#include "tests/faults/LeakCheck.h"
 
 namespace NORVZEL20 {
 
@@ -14,7 +15,7 @@ namespace {
 using TMake = std::function<std::unique_ptr<IFaultyAction>()>;
 
 struct TAttempt {
-    bool hasFailed;
+    bool hasFailed = false;
     std::string outcome;
 };
 
@@ -32,22 +33,11 @@ TAttempt Attempt(const TMake& make, std::size_t number, TFailingAllocator::EMode
     return {hasFailed, outcome};
 }
 
-/// The same, and checks that nothing is left behind.
-TAttempt AttemptWithoutLeak(const TMake& make, std::size_t number, TFailingAllocator::EMode mode)
-{
-    const TFailingAllocator::TUsage before = TFailingAllocator::GetLive();
-    const TAttempt attempt = Attempt(make, number, mode);
-    const TFailingAllocator::TUsage after = TFailingAllocator::GetLive();
-    EXPECT_EQ(before.blocks, after.blocks);
-    EXPECT_EQ(before.bytes, after.bytes);
-    return attempt;
-}
-
-void WarmUp(const TMake& make)
+void WarmUp(const TMake& make, const std::string& untouched)
 {
     for (int i = 0; i < 2; ++i) {
         const TAttempt attempt = Attempt(make, 0, TFailingAllocator::EMode::kOnce);
-        EXPECT_EQ("", attempt.outcome);
+        EXPECT_EQ(untouched, attempt.outcome);
     }
 }
 
@@ -72,17 +62,19 @@ std::string OutcomeOf(const std::function<void()>& call)
     return "";
 }
 
-std::string FailEachAllocation(const std::string& name, const TMake& make, TFailingAllocator::EMode mode)
+std::string FailEachAllocation(const std::string& name, const TMake& make, TFailingAllocator::EMode mode,
+                               const std::string& untouched)
 {
-    WarmUp(make);
+    WarmUp(make, untouched);
     std::string outcomes;
     std::string last = "none yet";
     std::size_t number = 1;
     while (!testing::Test::HasFailure()) {
         SCOPED_TRACE(name + ": allocation " + std::to_string(number));
-        const TAttempt attempt = AttemptWithoutLeak(make, number, mode);
+        TAttempt attempt;
+        ExpectNothingLeft([&] { attempt = Attempt(make, number, mode); });
         if (!attempt.hasFailed) {
-            EXPECT_EQ("", attempt.outcome);
+            EXPECT_EQ(untouched, attempt.outcome);
             break;
         }
         if (attempt.outcome != last) {

@@ -22,11 +22,11 @@ class IFaultyAction {
 std::string OutcomeOf(const std::function<void()>& call);
 
 /// Does the action again and again with the first, second, ... allocation failing, until it passes untouched; after each it
-/// verifies, and checks that as much lives as before.
+/// verifies, and checks that nothing is left. Untouched, it must come to `untouched`.
 ///
 /// Returns the outcomes, equal ones in a row once: "bad_alloc, status 4, bad_alloc". A failure that goes unnoticed is "". The
 /// number of allocations that failed is printed and recorded under `name`.
 std::string FailEachAllocation(const std::string& name, const std::function<std::unique_ptr<IFaultyAction>()>& make,
-                               TFailingAllocator::EMode mode = TFailingAllocator::EMode::kOnce);
+                               TFailingAllocator::EMode mode = TFailingAllocator::EMode::kOnce, const std::string& untouched = "");
 
 }  // namespace NORVZEL20

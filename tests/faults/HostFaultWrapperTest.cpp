@@ -6,6 +6,8 @@
 #include "host/TAddToVectorCallback.h"
 #include "tests/faults/DifferingNamespaces.h"
 #include "tests/faults/FailEachAllocation.h"
+#include "tests/faults/LeakCheck.h"
+#include "tests/faults/TDifferingRun.h"
 #include "tests/support/TComparisonRun.h"
 #include "tests/support/TTestAccess.h"
 
@@ -25,9 +27,12 @@ class FailingHostOfWrappers : public testing::TestWithParam<EHost> {
 
     void FailEachCall(EStatus status)
     {
-        std::size_t call = 1;
-        while (!HasFailure() && FailCall(call, status)) {
+        FailCall(0, status);  // what is made once in the process is made by now
+        std::size_t call = 0;
+        bool hasFailed = true;
+        while (!HasFailure() && hasFailed) {
             ++call;
+            ExpectNothingLeft([&] { hasFailed = FailCall(call, status); });
         }
         EXPECT_GT(call, 10u);
         std::cout << GetParam() << ", wrappers: " << call - 1 << " calls failed with status " << status << "\n";
@@ -50,6 +55,8 @@ class FailingHostOfWrappers : public testing::TestWithParam<EHost> {
         watch.StopFailing();
         EXPECT_EQ(watch.HasFailed() ? Expected(LineOf(call, watch), status) : "", outcome) << watch.GetText();
         ExpectThatItWorks(comparison.Delta());
+        ExpectThatItAnswers({GetParam(), 2, false}, comparison.Delta(), 0);
+        fSeen = std::string();
         return watch.HasFailed();
     }
 

@@ -1,72 +1,121 @@
 #include <gtest/gtest.h>
 
+#include <numeric>
+
 #include "tests/faults/TFaultyRun.h"
 
 namespace NORVZEL20 {
 namespace {
 
-struct TCase {
-    const char* name;
-    std::size_t namespaces;
-    bool excludesKeys;
-};
+using EMode = TFailingAllocator::EMode;
+
+std::vector<std::size_t> NumbersUpTo(std::size_t last)
+{
+    std::vector<std::size_t> numbers(last + 1);
+    std::iota(numbers.begin(), numbers.end(), 0);
+    return numbers;
+}
 
 /// Memory that runs out during a run.
-class RunOutOfMemory : public testing::TestWithParam<TCase> {
+class RunOutOfMemory : public testing::TestWithParam<TDiffering> {
   protected:
-    std::string FailEach(const std::string& series, TFailingAllocator::EMode mode)
+    /// The outcomes; checks that each number of records was left, from none to all.
+    std::string FailEach(EMode mode)
     {
-        const TCase& param = GetParam();
-        const TUntouchedRun expected = TFaultyRun::DoUntouched(param.namespaces, param.excludesKeys);
-        EXPECT_FALSE(expected.records.empty());
-        const auto make = [&] { return std::make_unique<TFaultyRun>(param.namespaces, param.excludesKeys, expected); };
-        return FailEachAllocation(series + param.name, make, mode);
+        const TDiffering& differing = GetParam();
+        const TUntouchedRun expected = RunUntouched(differing);
+        EXPECT_EQ(differing.flaw == EFlaw::kUnknownProperty, expected.records.empty());
+        std::vector<std::size_t> left;
+        left.reserve(expected.records.size() + 1);
+        const auto make = [&] { return std::make_unique<TFaultyRun>(differing, expected, left); };
+        const std::string series = mode == EMode::kOnce ? "RunOnce" : "RunFromThenOn";
+        const std::string outcomes = FailEachAllocation(series + differing.GetName(), make, mode, expected.outcome);
+        EXPECT_EQ(NumbersUpTo(expected.records.size()), left);
+        return outcomes;
     }
 };
 
+// Before the check of the operating systems, in it, up to the buffer for the specification, that buffer, all the rest.
+const char kOutcomes[] = "bad_alloc, status 3, bad_alloc, status 4, bad_alloc";
+
 TEST_P(RunOutOfMemory, OneFailedAllocationEndsItAndTheNextRunIsWhole)
 {
-    // Before the check of the operating systems, in it, up to the buffer for the specification, that buffer, all the rest.
-    EXPECT_EQ("bad_alloc, status 3, bad_alloc, status 4, bad_alloc", FailEach("RunOnce", TFailingAllocator::EMode::kOnce));
+    EXPECT_EQ(kOutcomes, FailEach(EMode::kOnce));
 }
 
 TEST_P(RunOutOfMemory, ExhaustedMemoryEndsItAndTheNextRunIsWhole)
 {
-    // The check of the operating systems cannot even make its log entry.
-    EXPECT_EQ("bad_alloc, status 4, bad_alloc", FailEach("RunFromThenOn", TFailingAllocator::EMode::kFromThenOn));
+    EXPECT_EQ(kOutcomes, FailEach(EMode::kFromThenOn));
 }
 
-INSTANTIATE_TEST_SUITE_P(Faults, RunOutOfMemory,
-                         testing::Values(TCase{"TwoNamespaces", 2, false}, TCase{"TwoNamespacesWithExcludedKeys", 2, true},
-                                         TCase{"ThreeNamespaces", 3, false}, TCase{"ThreeNamespacesWithExcludedKeys", 3, true}),
-                         [](const auto& test) { return std::string(test.param.name); });
+std::string NameOf(const testing::TestParamInfo<TDiffering>& test)
+{
+    return test.param.GetName();
+}
+
+INSTANTIATE_TEST_SUITE_P(Faults, RunOutOfMemory, testing::ValuesIn(TDiffering::All()), NameOf);
+
+INSTANTIATE_TEST_SUITE_P(FaultsOfFlawed, RunOutOfMemory,
+                         testing::Values(TDiffering{EHost::kInmem, 3, true, EFlaw::kNoSlots},
+                                         TDiffering{EHost::kPlain, 2, false, EFlaw::kNoSlots},
+                                         TDiffering{EHost::kPlain, 3, true, EFlaw::kNoUplinkOfSlots},
+                                         TDiffering{EHost::kPlain, 3, false, EFlaw::kUnknownProperty},
+                                         TDiffering{EHost::kInmem, 2, true, EFlaw::kNoUplinkOfSlots},
+                                         TDiffering{EHost::kInmem, 2, true, EFlaw::kUnknownProperty}),
+                         NameOf);
+
+struct TFlawed {
+    EFlaw flaw;
+    const char* outcome;
+    const char* log;
+};
+
+TEST(DifferingNamespaces, WithAFlawEndARunWithItsStatus)
+{
+    const TFlawed flaws[] = {
+        {EFlaw::kNone, "", ""},
+        {EFlaw::kNoSlots, "status 37", "0|TCIMDiffEngine: Schema do not match. (Couldn't find class Slot in namespace 2)\n|"},
+        {EFlaw::kNoUplinkOfSlots, "status 15", ""},
+        {EFlaw::kUnknownProperty, "status 9",
+         "0|Diff-XML Parser line 5:Invalid property \"a property that nothing has\" specified on line 5\n|"
+         "0|TDiffXMLParser: Threw exception in EndElementParse error on line 5|"},
+    };
+    for (const TFlawed& flawed : flaws) {
+        const TUntouchedRun run = RunUntouched({EHost::kInmem, 3, true, flawed.flaw});
+        EXPECT_EQ(flawed.outcome, run.outcome);
+        EXPECT_EQ(flawed.log, run.log);
+    }
+}
 
 TEST(DifferingNamespaces, AreRecordedInEveryWay)
 {
-    const TUntouchedRun run = TFaultyRun::DoUntouched(3, true);
+    const TUntouchedRun run = RunUntouched({EHost::kInmem, 3, true});
     const std::vector<std::string> expected = {
         "class Disk",
         "1 Disk.Id=\"only in the reference, alas\"  {1, 2}",
         "tie",
         "2 Disk.Id=\"not in the reference, alas\"  {1, 2}",
         "tie",
+        "4 Disk.Id=\"common\" Mirror {1, 2}",
+        "tie",
         "4 Disk.Id=\"common\" Size {1, 2}",
+        "tie",
+        "4 Disk.Id=\"lone\" Mirror {1, 2}",
         "tie",
         "class Ssd",
         "4 Ssd.Id=\"solid\" Wear {1, 2}",
         "tie",
         "class Slot",
-        "1 root/cimv2:Slot.Bus=\"a bus with a long name, number 0\",Number=10  {1, 2}",
+        "1 root/cimv2:Slot.BusOfTheEnclosure=\"a bus with a long name, number 0\",Number=10,ShelfOfTheEnclosure=0  {1, 2}",
         "tie",
         "2 Slot.Number=11  {1}",
         "tie",
         "2 Slot.Number=12  {2}",
         "tie",
-        "4 Slot.Number=1 State {1, 2}",
+        "4 Slot.Number=1 Uplink {1, 2}",
         "tie",
     };
     EXPECT_EQ(expected, run.records);
-    EXPECT_EQ(expected, run.secondRecords);
     EXPECT_NE("", run.aliases);
 }
 

@@ -60,7 +60,10 @@ class SpecificationFile : public testing::Test {
     }
 
     const std::string kContents = RulesForDiffering(true);
-    const std::string kRules = "Disk include\nGhost include\nSlot exclude State:INCLUDE -Bus\nSsd include\n";
+    const std::string kRules = "Disk include Note:EXCLUDE\n"
+                               "Ghost include Note:EXCLUDE\n"
+                               "Slot exclude Peer:INCLUDE Uplink:INCLUDE -BusOfTheEnclosure -ShelfOfTheEnclosure\n"
+                               "Ssd exclude final Mirror:INCLUDE Note:EXCLUDE Wear:INCLUDE\n";
     TCapturingLogger fLog;
     TScratchFile fFile{kContents};
     std::string fRules;

@@ -4,51 +4,35 @@
 #include <string>
 #include <vector>
 
-#include "provider/TDeltaNamespace.h"
 #include "tests/faults/FailEachAllocation.h"
+#include "tests/faults/TDifferingRun.h"
 #include "tests/support/TCapturingLogger.h"
 #include "tests/support/TScratchFile.h"
 
 namespace NORVZEL20 {
 
-/// What a run over differing namespaces comes to when nothing fails.
-struct TUntouchedRun {
-    std::vector<std::string> records;        ///< as TraceRecords tells them
-    std::vector<std::string> secondRecords;  ///< of one more run
-    std::string reference;                   ///< namespace 0 after both, as DumpDiffering tells it
-    std::string aliases;                     ///< as DumpAliases tells them
-};
-
-/// A run over differing namespaces of the embedded host, to be done while memory runs out.
+/// A run over differing namespaces, to be done while memory runs out.
 class TFaultyRun : public IFaultyAction {
   public:
-    TFaultyRun(std::size_t namespaces, bool excludesKeys, const TUntouchedRun& expected);
+    /// How many records Act leaves is appended to `left`, unless it is as many as stand there last or it passes the first times.
+    TFaultyRun(const TDiffering& differing, const TUntouchedRun& expected, std::vector<std::size_t>& left);
     ~TFaultyRun() override;
 
-    static TUntouchedRun DoUntouched(std::size_t namespaces, bool excludesKeys);
-
     void Act() override;
-    /// Checks that the records written are the first ones of the untouched run, that the delta namespace answers, and that another
-    /// run writes all of them.
+    /// Checks that the log is whole, that the records written are the first ones of the untouched run, that the delta namespace
+    /// answers, and that another run is whole.
     void Verify(const std::string& outcome) override;
 
   private:
-    TFaultyRun(std::size_t namespaces, bool excludesKeys);
+    void VerifyLog(const std::string& outcome);
+    void VerifyRecords(const std::string& outcome, const std::vector<std::string>& records);
 
-    std::vector<std::string> GetRecords() const;
-    void VerifyAnotherRun(const std::vector<std::string>& before);
-
+    TDiffering fDiffering;
+    const TUntouchedRun& fExpected;
+    std::vector<std::size_t>& fLeft;
     TCapturingLogger fLog;
     TScratchFile fRules;
-    boost::shared_ptr<TDeltaNamespace> fDelta;
-    std::vector<boost::shared_ptr<ICIMNamespace>> fNamespaces;
-    const TUntouchedRun* fExpected = nullptr;
+    TCompared fCompared;
 };
-
-/// Checks that `part` is what `whole` begins with.
-void ExpectPrefix(const std::vector<std::string>& part, const std::vector<std::string>& whole);
-
-/// Checks that a delta namespace of differing namespaces answers: the schema's classes, a wrapper, a query over `deltas` records.
-void ExpectThatItAnswers(TDeltaNamespace& delta, std::size_t deltas);
 
 }  // namespace NORVZEL20

@@ -1,12 +1,14 @@
 #include <gtest/gtest.h>
 
-#include <filesystem>
 #include <iostream>
 
 #include "embedded/TCoreLog.h"
+#include "tests/faults/LeakCheck.h"
 #include "tests/faults/TFailingAllocator.h"
+#include "tests/faults/TraceRecords.h"
 #include "tests/longrun/TRecordWriter.h"
 #include "tests/longrun/TSmallComparison.h"
+#include "tests/support/Dump.h"
 #include "tests/support/TTestAccess.h"
 
 namespace NORVZEL20 {
@@ -30,11 +32,6 @@ class TQuietLogger : public ILogger {
   private:
     ILogger* fBefore;
 };
-
-std::ptrdiff_t CountOpenFiles()
-{
-    return std::distance(std::filesystem::directory_iterator("/proc/self/fd"), std::filesystem::directory_iterator());
-}
 
 std::size_t CountInstances(TDeltaNamespace& delta, const std::string& className)
 {
@@ -73,17 +70,17 @@ TEST(LongRun, NewDeltaNamespacesOverTheSameThreeNamespacesLeaveNothing)
     ExpectFlat("RunsOverThree", kManyRuns, [&comparison] {
         const auto delta = comparison.MakeDelta();
         delta->FindDifferences();
-        EXPECT_EQ(10u, CountInstances(*delta, "KALMO_Delta"));
+        EXPECT_EQ(12u, CountInstances(*delta, "KALMO_Delta"));
     });
 }
 
 TEST(LongRun, NewDeltaNamespacesOverTwoNewNamespacesLeaveNothing)
 {
-    ExpectFlat("RunsOverTwoNew", 1000, [] {
+    ExpectFlat("RunsOverTwoNew", kManyRuns, [] {
         const TSmallComparison comparison(2, false);
         const auto delta = comparison.MakeDelta();
         delta->FindDifferences();
-        EXPECT_EQ(8u, CountInstances(*delta, "KALMO_Delta"));
+        EXPECT_EQ(10u, CountInstances(*delta, "KALMO_Delta"));
     });
 }
 
@@ -99,75 +96,109 @@ TEST(LongRun, FailingRunsLeaveNothing)
     });
 }
 
-/// A thousand runs of one delta namespace.
-class RepeatedRuns : public testing::Test {
+/// A delta namespace whose wrappers are forgotten in the end, so that it goes.
+class TOwnedDelta {
+  public:
+    explicit TOwnedDelta(const TSmallComparison& comparison) : fDelta(comparison.MakeDelta()) {}
+    TOwnedDelta(const TOwnedDelta&) = delete;
+    TOwnedDelta& operator=(const TOwnedDelta&) = delete;
+    ~TOwnedDelta() { TTestAccess::ForgetWrappers(*fDelta); }
+
+    TDeltaNamespace& operator*() const { return *fDelta; }
+    TDeltaNamespace* operator->() const { return fDelta.get(); }
+    std::vector<std::string> TellRecords() const { return TraceRecords(TTestAccess::Store(*fDelta)); }
+
+  private:
+    boost::shared_ptr<TDeltaNamespace> fDelta;
+};
+
+/// A thousand runs of one delta namespace, with or without excluded keys.
+class RepeatedRuns : public testing::TestWithParam<bool> {
   protected:
     static constexpr std::size_t kRuns = 1000;
 
-    /// What lives more after than before, while what `make` made lives.
-    template <class TMake>
-    static TUsage MeasureLife(TMake make)
+    /// Does `act` that often.
+    template <class TAct>
+    static void Repeat(std::size_t times, TAct act)
     {
+        for (std::size_t i = 0; i < times; ++i) {
+            act();
+        }
+    }
+
+    /// What lives more after a thousand times than before; with excluded keys, than after the first, which makes the wrappers.
+    template <class TAct>
+    static TUsage MeasureGrowth(TAct act)
+    {
+        const std::size_t first = GetParam() ? 1 : 0;
+        Repeat(first, act);
         const TUsage before = TFailingAllocator::GetLive();
-        const auto made = make();
+        Repeat(kRuns - first, act);
         const TUsage after = TFailingAllocator::GetLive();
         return {after.blocks - before.blocks, after.bytes - before.bytes};
     }
 
-    boost::shared_ptr<TDeltaNamespace> MakeAndRun() const
+    TUsage MeasureRuns() const
     {
-        const auto delta = fComparison.MakeDelta();
-        for (std::size_t run = 0; run < kRuns; ++run) {
-            delta->FindDifferences();
-        }
-        return delta;
+        const TOwnedDelta delta(fComparison);
+        return MeasureGrowth([&delta] { delta->FindDifferences(); });
     }
 
-    /// The same records without any run.
-    boost::shared_ptr<TDeltaNamespace> MakeAndWrite(const TRecordWriter& writer) const
+    /// MeasureRuns of the same records without any run.
+    TUsage MeasureWriting(const TRecordWriter& writer) const
     {
-        const auto delta = fComparison.MakeDelta();
-        for (std::size_t run = 0; run < kRuns; ++run) {
-            writer.WriteInto(*delta);
-        }
-        return delta;
+        const TOwnedDelta delta(fComparison);
+        return MeasureGrowth([&] { writer.WriteInto(*delta); });
     }
 
-    const TSmallComparison fComparison{3, false};
+    const TSmallComparison fComparison{3, GetParam()};
 };
 
-TEST_F(RepeatedRuns, AccumulateTheirRecordsExactly)
+TEST_P(RepeatedRuns, AccumulateTheirRecordsExactly)
 {
-    const auto once = fComparison.MakeDelta();
+    const TOwnedDelta once(fComparison);
     once->FindDifferences();
-    const std::vector<std::string> records = TraceRecords(TTestAccess::Store(*once));
+    const std::vector<std::string> records = once.TellRecords();
 
-    const auto delta = MakeAndRun();
-    EXPECT_EQ(3 * kRuns, CountInstances(*delta, "KALMO_DeltaClass"));
-    EXPECT_EQ(10 * kRuns, CountInstances(*delta, "KALMO_Delta"));
-    EXPECT_EQ(10 * kRuns, CountInstances(*delta, "KALMO_DeltaClassAssocToDelta"));
-    const std::vector<std::string> all = TraceRecords(TTestAccess::Store(*delta));
+    const TOwnedDelta delta(fComparison);
+    Repeat(kRuns, [&delta] { delta->FindDifferences(); });
+    const std::vector<std::string> all = delta.TellRecords();
     ASSERT_EQ(records.size() * kRuns, all.size());
     for (std::size_t index = 0; index < all.size(); ++index) {
         ASSERT_EQ(records[index % records.size()], all[index]) << index;
     }
 }
 
-TEST_F(RepeatedRuns, TakeNoMoreMemoryThanTheirRecords)
+TEST_P(RepeatedRuns, TakeNoMoreMemoryThanTheirRecords)
 {
-    const auto once = fComparison.MakeDelta();
+    const TOwnedDelta once(fComparison);
     once->FindDifferences();
     const TRecordWriter writer(TTestAccess::Store(*once));
 
-    MeasureLife([this] { return MakeAndRun(); });
-    const TUsage run = MeasureLife([this] { return MakeAndRun(); });
-    const TUsage written = MeasureLife([&] { return MakeAndWrite(writer); });
+    MeasureRuns();
+    const TUsage run = MeasureRuns();
+    const TUsage written = MeasureWriting(writer);
     EXPECT_EQ(written.blocks, run.blocks);
     EXPECT_EQ(written.bytes, run.bytes);
     std::cout << kRuns << " runs of one delta namespace: " << run.bytes
               << " bytes, as many as their records written without a run\n";
     RecordProperty("RunsOfOneNamespace", std::to_string(kRuns));
 }
+
+TEST_P(RepeatedRuns, KeepTheWrappersAndAliasesOfTheFirst)
+{
+    const TOwnedDelta delta(fComparison);
+    delta->FindDifferences();
+    const auto wrappers = TTestAccess::ClassCache(*delta);
+    const std::string aliases = DumpAliases(*delta);
+    EXPECT_EQ(GetParam(), !aliases.empty());
+    Repeat(kRuns - 1, [&delta] { delta->FindDifferences(); });
+    EXPECT_EQ(wrappers, TTestAccess::ClassCache(*delta));
+    EXPECT_EQ(aliases, DumpAliases(*delta));
+}
+
+INSTANTIATE_TEST_SUITE_P(LongRun, RepeatedRuns, testing::Bool(),
+                         [](const auto& test) { return test.param ? "WithExcludedKeys" : "WithoutExcludedKeys"; });
 
 }  // namespace
 }  // namespace NORVZEL20

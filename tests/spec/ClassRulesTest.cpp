@@ -1,6 +1,7 @@
 #include <gmock/gmock.h>
 
 #include <boost/smart_ptr/make_shared.hpp>
+#include <sstream>
 
 #include "embedded/TAssertionFailure.h"
 #include "spec/TDiffClassRules.h"
@@ -65,6 +66,27 @@ TEST(ExcludedKeysTest, AnyWhiteSpaceSeparatesNames)
     rules.excludeKeys("  KeyA\t\tKeyB\n KeyC \r\n");
     EXPECT_THAT(rules.fExcludedKeys, ElementsAre("KeyA", "KeyB", "KeyC"));
     EXPECT_TRUE(rules.hasExcludedKeys());
+}
+
+/// The words of a text as a formatted read tells them.
+std::vector<std::string> WordsOf(const std::string& text)
+{
+    std::istringstream in(text);
+    std::vector<std::string> words;
+    for (std::string word; in >> word;) {
+        words.push_back(word);
+    }
+    return words;
+}
+
+TEST(ExcludedKeysTest, EveryCharacterSeparatesOrNotAsInAFormattedRead)
+{
+    for (int code = 0; code < 256; ++code) {
+        const std::string character(1, static_cast<char>(code));
+        TRules rules;
+        rules.excludeKeys(character + "KeyA" + character + character + "KeyB" + character);
+        EXPECT_EQ(WordsOf(character + "KeyA" + character + character + "KeyB" + character), rules.fExcludedKeys) << code;
+    }
 }
 
 TEST(ExcludedKeysTest, NamesAreAddedAndRepeatedOnesKept)

@@ -1,12 +1,13 @@
 #include "tests/support/TCapturingLogger.h"
 
-#include <utility>
-
 #include "embedded/TCoreLog.h"
 
 namespace NORVZEL20 {
 
-TCapturingLogger::TCapturingLogger() : fBefore(TCoreLog::Set(this)) {}
+TCapturingLogger::TCapturingLogger() : fBefore(TCoreLog::Set(this))
+{
+    fText.reserve(4096);  // so that there is room where a test leaves no memory
+}
 
 TCapturingLogger::~TCapturingLogger()
 {
@@ -15,12 +16,14 @@ TCapturingLogger::~TCapturingLogger()
 
 void TCapturingLogger::Log(int level, const std::string& message)
 {
-    fText += std::to_string(level) + "|" + message + "|";
+    fText.append(std::to_string(level)).append("|").append(message).append("|");
 }
 
 std::string TCapturingLogger::Take()
 {
-    return std::exchange(fText, std::string());
+    const std::string text = fText;
+    fText.clear();
+    return text;
 }
 
 }  // namespace NORVZEL20
