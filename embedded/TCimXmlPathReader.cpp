@@ -1,6 +1,7 @@
 #include "embedded/TCimXmlPathReader.h"
 
 #include "embedded/TNameText.h"
+#include "embedded/TReferenceAdapter.h"
 #include "embedded/TValueText.h"
 
 namespace NORVZEL20 {
@@ -54,22 +55,12 @@ TCIMReference TCimXmlPathReader::End()
     }
     for (const auto& [declared, value] : frame.keys) {
         std::string name = declared.empty() ? FindOnlyKey(cls.get()) : declared;
-        const TCIMValue adapted = cls ? Adapt(*cls, name, value) : value;
+        TCIMValue adapted = value;
+        if (cls)
+            TReferenceAdapter::AdaptKey(*cls, name, adapted);
         path.AddKeyValue(name, adapted);
     }
     return path;
-}
-
-/// The value in the declared type of the key where that loses nothing; the name in its declared spelling.
-TCIMValue TCimXmlPathReader::Adapt(const TInMemClass& cls, std::string& name, const TCIMValue& value) const
-{
-    const std::uint32_t slot = cls.FindSlot(name);
-    if (slot == TInMemClass::kNoSlot)
-        return value;
-    const TInMemPropertyDecl& decl = cls.GetSlotDecl(slot);
-    name = decl.GetName();
-    TCIMValue adapted;
-    return value.GetType() != decl.GetType() && TValueText::Convert(value, decl.GetType(), adapted) ? adapted : value;
 }
 
 /// The key that a value without a name belongs to.

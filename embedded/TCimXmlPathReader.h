@@ -49,6 +49,8 @@ class TCimXmlPathReader {
 
     /// Whether End met a class that is not declared since this was last asked.
     bool TakeMetUnknownClass() noexcept { return std::exchange(fMetUnknownClass, false); }
+    /// For paths that another reader has read.
+    void NoteUnknownClass() noexcept { fMetUnknownClass = true; }
 
   private:
     struct TFrame {
@@ -61,7 +63,6 @@ class TCimXmlPathReader {
 
     boost::shared_ptr<TInMemClass> FindClass(const std::string& name);
     TCIMValue ReadKey(std::string_view text);
-    TCIMValue Adapt(const TInMemClass& cls, std::string& name, const TCIMValue& value) const;
     const std::string& FindOnlyKey(const TInMemClass* cls) const;
 
     TCimXmlContext& fContext;

@@ -5,6 +5,7 @@
 #include <cstring>
 #include <utility>
 
+#include "embedded/TValueAccess.h"
 #include "embedded/TValueText.h"
 
 namespace NORVZEL20 {
@@ -24,6 +25,13 @@ std::string Quote(std::string_view text)
 bool IsBlank(char c)
 {
     return c == ' ' || c == '\n' || c == '\t' || c == '\r';
+}
+
+/// Whether text that may be an embedded object is one: writers that do not mark those write plain text beside them.
+bool LooksLikeObject(std::string_view text)
+{
+    const auto start = std::find_if_not(text.begin(), text.end(), IsBlank);
+    return start != text.end() && *start == '<';
 }
 
 bool IsMarkedEmbedded(const TCimXmlAttributes& attributes)
@@ -49,6 +57,8 @@ class TCimXmlReader::TEmbedded {
                           "found " + Quote(text) + ", expected an <INSTANCE> or a <CLASS> (" + fXml.GetError() + ")");
         return fSink.TakeObject();
     }
+
+    bool TakeMetUnknownClass() noexcept { return fSink.fPaths.TakeMetUnknownClass(); }
 
   private:
     TCimXmlContext& fContext;
@@ -350,14 +360,24 @@ void TCimXmlReader::MakeValue(std::string_view text, TCIMValue& value)
                                                   TValueText::GetTypeName(type));
 }
 
-/// Whether the text is that of an embedded object. Writers that do not mark those write plain text into their properties too.
 bool TCimXmlReader::IsObject(std::string_view text) const
 {
-    if (fItem->text == TItem::kPerhapsObject) {
-        const auto start = std::find_if_not(text.begin(), text.end(), IsBlank);
-        return start != text.end() && *start == '<';
-    }
+    if (fItem->text == TItem::kPerhapsObject)
+        return LooksLikeObject(text);
     return fItem->text == TItem::kObject && !text.empty();
+}
+
+TCIMValue TCimXmlReader::ReadObjects(const TCIMValue& value)
+{
+    if (value.IsNull())
+        return value;
+    if (value.GetType().IsArray()) {
+        std::vector<TCIMValue> elements;
+        for (const TCIMValue& element : value.GetElements())
+            elements.push_back(ReadObjects(element));
+        return TCIMValue(value.GetType(), static_cast<unsigned int>(elements.size()), elements);
+    }
+    return TValueAccess::IsText(value) && LooksLikeObject(value.GetString()) ? MakeObject(value.GetString()) : value;
 }
 
 TCIMValue TCimXmlReader::MakeObject(std::string_view text)
@@ -369,6 +389,8 @@ TCIMValue TCimXmlReader::MakeObject(std::string_view text)
     ++fContext.fEmbeddedDepth;
     TCIMValue value(fEmbedded->Read(text));
     --fContext.fEmbeddedDepth;
+    if (fEmbedded->TakeMetUnknownClass())
+        fPaths.NoteUnknownClass();
     return value;
 }
 

@@ -30,6 +30,9 @@ class TCimXmlReader : public TXmlReader::ISink {
     void OnEnd(const char* name) override;
     void OnText(const char* text, std::size_t length) override { fText = std::string_view(text, length); }
 
+    /// The value with those of its texts read that are embedded objects, for a property that its declaration says holds such.
+    TCIMValue ReadObjects(const TCIMValue& value);
+
     /// Starts over, for another embedded object.
     void Reset();
     /// The embedded object that was read. Errors: fails with status 13 where there is none.
