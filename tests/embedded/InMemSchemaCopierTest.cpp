@@ -91,8 +91,32 @@ TEST_F(InMemSchemaCopierTest, NamesAreRespelledAndReferencesStayFound)
     EXPECT_EQ(sda, target->FindInstance(sda->GetReference()));
     EXPECT_TRUE(copier.RespellProperty(*room, "NAME"));
     EXPECT_FALSE(copier.RespellProperty(*room, "NAME"));
-    EXPECT_FALSE(copier.RespellProperty(*target->FindClass("Disk"), "ID"));
+    EXPECT_FALSE(copier.RespellProperty(*room, "Floor"));
     EXPECT_EQ("other:Room.NAME=\"hall\"", hall->GetReference().GetPath());
+}
+
+TEST_F(InMemSchemaCopierTest, AnInheritedNameIsRespelledByOverridingIt)
+{
+    copier.CopyClass(*disk);
+    const auto copy = target->FindClass("Disk");
+    const auto sda = Add(copy, {{"Id", "sda"}, {"Size", std::uint64_t(5)}});
+    EXPECT_TRUE(copier.RespellProperty(*copy, "ID"));
+    EXPECT_FALSE(copier.RespellProperty(*copy, "ID"));
+    EXPECT_EQ("Id", target->FindClass("Device")->FindPropertyDecl("id")->GetName());
+    EXPECT_EQ("Key", QualifiersOf(*copy->FindPropertyDecl("id")));
+    EXPECT_EQ("ID=sda Size=5 Room=NULL", ValuesOf(*sda));
+    EXPECT_EQ("other:Disk.ID=\"sda\"", sda->GetReference().GetPath());
+    EXPECT_EQ(sda, target->FindInstance(Path("Disk.Id=\"sda\"")));
+}
+
+TEST_F(InMemSchemaCopierTest, AStaticPropertyKeepsItsValueWhenItIsRespelled)
+{
+    device->AddPropertyDecl(Decl({"Version", TType::kString, {"Static"}}));
+    copier.CopyClass(*disk);
+    const auto copy = target->FindClass("Disk");
+    copy->SetPropertyValue("Version", TCIMValue("1"), none);
+    EXPECT_TRUE(copier.RespellProperty(*copy, "VERSION"));
+    EXPECT_EQ("1", copy->GetProperty("Version", none)->GetValue(none).ToText());
 }
 
 }  // namespace
