@@ -97,8 +97,10 @@ void TCimXmlLoader::DeclareClass(std::size_t number)
         if (!super && !waiting.draft.object.GetSuperClassName().empty())
             continue;
         const TCimXmlContext::TAt at(fContext, waiting.draft.place);
-        super = TCimXmlClassMaker(fContext, *fNamespace).Make(waiting.draft, super);
-        fStaging.AddClass(super);
+        fContext.Guard([&] {
+            super = TCimXmlClassMaker(fContext, *fNamespace).Make(waiting.draft, super);
+            fStaging.AddClass(super);
+        });
         waiting.state = TClassDraft::kDeclared;
         fDeclaredLate = fDeclaredLate || fNumber > 0 || fDeferring;
     }

@@ -1,5 +1,7 @@
 #include "embedded/TCimXmlPathReader.h"
 
+#include <cstring>
+
 #include "embedded/TNameText.h"
 #include "embedded/TReferenceAdapter.h"
 #include "embedded/TValueText.h"
@@ -10,6 +12,10 @@ namespace {
 
 using EStatus = TZELStatusCode::EStatusCode;
 using TType = TCIMValue::TCIMType;
+
+// As deep as a path may hold others, with the object's own around. Paths become text where a key is declared as text, and each
+// level doubles the escapes of the one within.
+constexpr std::size_t kMaxDepth = 14;
 
 /// A number whose type the document does not tell.
 bool ReadNumber(std::string_view text, TCIMValue& value)
@@ -26,13 +32,16 @@ TCimXmlPathReader::TCimXmlPathReader(TCimXmlContext& context, boost::shared_ptr<
 
 void TCimXmlPathReader::Begin()
 {
-    if (++fDepth > fFrames.size())
+    if (++fDepth > kMaxDepth)
+        FailTooDeep();
+    if (fDepth > fFrames.size())
         fFrames.emplace_back();
     TFrame& frame = fFrames[fDepth - 1];
     frame.namespaceName.clear();
     frame.host.clear();
     frame.className.clear();
     frame.keyName.clear();
+    frame.isInBinding = false;
     frame.keys.clear();
 }
 
@@ -46,6 +55,7 @@ TCIMReference TCimXmlPathReader::End()
     if (cls) {
         path.SetClass(cls);
     } else {
+        fContext.CheckName("class", frame.className);
         path.SetClassName(frame.className);
         fMetUnknownClass = true;
     }
@@ -56,11 +66,27 @@ TCIMReference TCimXmlPathReader::End()
     for (const auto& [declared, value] : frame.keys) {
         std::string name = declared.empty() ? FindOnlyKey(cls.get()) : declared;
         TCIMValue adapted = value;
-        if (cls)
-            TReferenceAdapter::AdaptKey(*cls, name, adapted);
-        path.AddKeyValue(name, adapted);
+        if (!cls || TReferenceAdapter::AdaptKey(*cls, name, adapted) == nullptr)
+            fContext.CheckName("key", name);
+        AddKeyTo(path, name, adapted);
     }
+    if (path.GetKeyCount() < frame.keys.size())
+        fContext.Fail(EStatus::kParseError, "found a key a second time in one path, expected each once");
     return path;
+}
+
+void TCimXmlPathReader::AddKeyTo(TCIMReference& path, const std::string& name, const TCIMValue& value) const
+{
+    try {
+        path.AddKeyValue(name, value);
+    } catch (const TZELException&) {
+        FailTooDeep();
+    }
+}
+
+void TCimXmlPathReader::FailTooDeep() const
+{
+    fContext.Fail(EStatus::kParseError, "found a path whose keys are paths within paths, more than can be told; flatten it");
 }
 
 /// The key that a value without a name belongs to.
@@ -98,11 +124,15 @@ void TCimXmlPathReader::AddNamespace(const char* name)
 {
     if (!fNamespaceName.empty())
         fNamespaceName += '/';
+    if (std::strpbrk(name, ":=\"") != nullptr)
+        fContext.Fail(EStatus::kParseError, "found namespace " + TCimXmlContext::Quote(name) + ", expected a name without \":=");
     fNamespaceName += name;
 }
 
 void TCimXmlPathReader::SetHost(std::string_view host)
 {
+    if (!fHost.empty() || host.find('/') != std::string_view::npos)
+        fContext.Fail(EStatus::kParseError, "found host " + TCimXmlContext::Quote(host) + ", expected one, without a slash");
     fHost = host;
 }
 
@@ -112,18 +142,33 @@ void TCimXmlPathReader::EndNamespacePath()
         fContext.NoteNamespace(fNamespaceName, fHost);
         return;
     }
+    if (!fFrames[fDepth - 1].namespaceName.empty())
+        fContext.Fail(EStatus::kParseError, "found a second namespace in one path, expected one");
     fFrames[fDepth - 1].namespaceName = fNamespaceName;
     fFrames[fDepth - 1].host = fHost;
 }
 
 void TCimXmlPathReader::SetClassName(const char* name)
 {
+    if (!fFrames[fDepth - 1].className.empty())
+        fContext.Fail(EStatus::kParseError, "found a second path where one is expected");
     fFrames[fDepth - 1].className = name;
 }
 
 void TCimXmlPathReader::BeginKeyBinding(const char* name)
 {
     fFrames[fDepth - 1].keyName = name;
+    fFrames[fDepth - 1].isInBinding = true;
+}
+
+void TCimXmlPathReader::EndKeyBinding()
+{
+    TFrame& frame = fFrames[fDepth - 1];
+    if (!frame.keyName.empty())
+        fContext.Fail(EStatus::kParseError,
+                      "found key " + TCimXmlContext::Quote(frame.keyName) +
+                          " without a value, expected a <KEYVALUE> or a <VALUE.REFERENCE> in its <KEYBINDING>");
+    frame.isInBinding = false;
 }
 
 void TCimXmlPathReader::BeginKeyValue(const TCimXmlAttributes& attributes)
@@ -140,6 +185,8 @@ void TCimXmlPathReader::EndKeyValue(std::string_view text)
 void TCimXmlPathReader::AddKey(TCIMValue value)
 {
     TFrame& frame = fFrames[fDepth - 1];
+    if (frame.isInBinding && frame.keyName.empty())
+        fContext.Fail(EStatus::kParseError, "found a second value in one <KEYBINDING>, expected one");
     frame.keys.emplace_back(frame.keyName, std::move(value));
     frame.keyName.clear();
 }

@@ -37,6 +37,7 @@ class TCimXmlPathReader {
 
     void SetClassName(const char* name);
     void BeginKeyBinding(const char* name);
+    void EndKeyBinding();
     void BeginKeyValue(const TCimXmlAttributes& attributes);
     void EndKeyValue(std::string_view text);
     void AddKey(TCIMValue value);
@@ -57,12 +58,15 @@ class TCimXmlPathReader {
         std::string namespaceName;
         std::string host;
         std::string className;
-        std::string keyName;
+        std::string keyName;       // of the KEYBINDING that is open and has no value yet
+        bool isInBinding = false;  // one is open
         std::vector<std::pair<std::string, TCIMValue>> keys;
     };
 
     boost::shared_ptr<TInMemClass> FindClass(const std::string& name);
     TCIMValue ReadKey(std::string_view text);
+    void AddKeyTo(TCIMReference& path, const std::string& name, const TCIMValue& value) const;
+    [[noreturn]] void FailTooDeep() const;
     const std::string& FindOnlyKey(const TInMemClass* cls) const;
 
     TCimXmlContext& fContext;

@@ -95,7 +95,7 @@ void TCimXmlReader::OnStart(const char* name, const char** attributes)
         FailUnexpected(name);
     fOpen.push_back({step.next, element});
     fText = std::string_view();
-    Begin(step.action, TCimXmlAttributes(attributes));
+    fContext.Guard([&] { Begin(step.action, TCimXmlAttributes(attributes)); });
 }
 
 void TCimXmlReader::OnEnd(const char*)
@@ -103,18 +103,8 @@ void TCimXmlReader::OnEnd(const char*)
     CheckBlank();
     const TTable::EAction action = TTable::GetEndAction(GetState());
     fOpen.pop_back();
-    End(action);
+    fContext.Guard([&] { End(action); });
     fText = std::string_view();
-}
-
-void TCimXmlReader::FailUnexpected(const char* name) const
-{
-    const TOpen& open = fOpen.back();
-    const std::string place = open.element == TElement::kUnknown ? " as the outermost element"
-                                                                 : std::string(" in <") + TElement::GetName(open.element) + ">";
-    const std::string shown = Quote(name);
-    fContext.Fail(EStatus::kParseError, "found element <" + shown.substr(1, shown.size() - 2) + ">" + place + ", expected " +
-                                            TTable::DescribeExpected(open.state));
 }
 
 /// Text where only elements may stand must be white space.
@@ -127,23 +117,6 @@ void TCimXmlReader::CheckBlank() const
                                                 ">, expected elements alone");
 }
 
-const char* TCimXmlReader::Require(const TCimXmlAttributes& attributes, const char* name) const
-{
-    const char* value = attributes.Find(name);
-    if (value == nullptr || *value == '\0')
-        fContext.Fail(EStatus::kParseError, std::string("found <") + TElement::GetName(fOpen.back().element) + "> without " + name +
-                                                ", expected that attribute with a value");
-    return value;
-}
-
-TType TCimXmlReader::ReadType(const char* text) const
-{
-    const TType type = TValueText::FindType(text);
-    if (type == TType::kNone)
-        fContext.Fail(EStatus::kParseError, "found type " + Quote(text) + ", expected a CIM type such as string or uint32");
-    return type;
-}
-
 void TCimXmlReader::Begin(TTable::EAction action, const TCimXmlAttributes& attributes)
 {
     switch (action) {
@@ -152,8 +125,7 @@ void TCimXmlReader::Begin(TTable::EAction action, const TCimXmlAttributes& attri
     case TTable::kBeginText:
         return BeginValue();
     case TTable::kBeginArray:
-        BeginValue();
-        return fElements.clear();
+        return BeginArray();
     case TTable::kAddNull:
         return fElements.push_back(TCIMValue::Null(fItem->type.GetElementType()));
     case TTable::kBeginInstance:
@@ -194,6 +166,8 @@ void TCimXmlReader::End(TTable::EAction action)
         return EndReference();
     case TTable::kEndKeyValue:
         return fPaths.EndKeyValue(fText);
+    case TTable::kEndKeyBinding:
+        return fPaths.EndKeyBinding();
     case TTable::kEndHost:
         return fPaths.SetHost(fText);
     case TTable::kEndNamespacePath:
@@ -311,6 +285,15 @@ void TCimXmlReader::BeginValue()
     if (fItem->isGiven)
         fContext.Fail(EStatus::kParseError, "found a second value for " + Quote(fItem->name) + ", expected one");
     fItem->isGiven = true;
+}
+
+void TCimXmlReader::BeginArray()
+{
+    BeginValue();
+    fElements.clear();
+    if (GetState() == TTable::kReferenceArray && fItem->type.GetElementType() != TType::kReference)
+        fContext.Fail(EStatus::kTypeMismatch, "found an array of references as value of " + Quote(fItem->name) + ", expected a " +
+                                                  TValueText::GetTypeName(fItem->type) + "[]");
 }
 
 /// What a value belongs to is the innermost element that is open when it has ended.

@@ -94,6 +94,7 @@ class TCimXmlReader : public TXmlReader::ISink {
     void BeginValue();
     void EndText();
     void EndReference();
+    void BeginArray();
     void EndArray();
     void MakeValue(std::string_view text, TCIMValue& value);
     bool IsObject(std::string_view text) const;

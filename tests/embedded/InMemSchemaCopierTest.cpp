@@ -99,14 +99,14 @@ TEST_F(InMemSchemaCopierTest, AnInheritedNameIsRespelledByOverridingIt)
 {
     copier.CopyClass(*disk);
     const auto copy = target->FindClass("Disk");
-    const auto sda = Add(copy, {{"Id", "sda"}, {"Size", std::uint64_t(5)}});
+    const auto sda = Add(copy, {{"Id", "sda"}, {"Room", TCIMValue(Path("Room"))}, {"Size", std::uint64_t(5)}});
     EXPECT_TRUE(copier.RespellProperty(*copy, "ID"));
     EXPECT_FALSE(copier.RespellProperty(*copy, "ID"));
     EXPECT_EQ("Id", target->FindClass("Device")->FindPropertyDecl("id")->GetName());
     EXPECT_EQ("Key", QualifiersOf(*copy->FindPropertyDecl("id")));
-    EXPECT_EQ("ID=sda Size=5 Room=NULL", ValuesOf(*sda));
-    EXPECT_EQ("other:Disk.ID=\"sda\"", sda->GetReference().GetPath());
-    EXPECT_EQ(sda, target->FindInstance(Path("Disk.Id=\"sda\"")));
+    EXPECT_EQ("ID=sda Size=5 Room=Room", ValuesOf(*sda));
+    EXPECT_EQ("other:Disk.ID=\"sda\",Room=\"Room\"", sda->GetReference().GetPath());
+    EXPECT_EQ(sda, target->FindInstance(Path("Disk.Id=\"sda\",Room=\"Room\"")));
 }
 
 TEST_F(InMemSchemaCopierTest, AStaticPropertyKeepsItsValueWhenItIsRespelled)
