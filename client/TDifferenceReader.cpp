@@ -5,6 +5,7 @@
 
 #include "client/CimWalk.h"
 #include "embedded/TInMemProperty.h"
+#include "embedded/TInMemStaticProperty.h"
 
 namespace NORVZEL20 {
 
@@ -14,8 +15,12 @@ namespace {
 TCIMValue ValueBefore(const ICIMInstance& instance, const std::string& property)
 {
     const boost::shared_ptr<ICIMProperty> handle = instance.GetProperty(property, TCallContext());
-    const TInMemProperty* stored = dynamic_cast<const TInMemProperty*>(handle.get());
-    const TCIMValue* earlier = stored == nullptr ? nullptr : stored->GetEarlierValue();
+    const TCIMValue* earlier = nullptr;
+    if (const auto* stored = dynamic_cast<const TInMemProperty*>(handle.get())) {
+        earlier = stored->GetEarlierValue();
+    } else if (const auto* ofClass = dynamic_cast<const TInMemStaticProperty*>(handle.get())) {
+        earlier = ofClass->GetEarlierValue();
+    }
     return earlier == nullptr ? handle->GetValue(TCallContext()) : *earlier;
 }
 

@@ -123,6 +123,7 @@ TCimXmlLoader::TLayout* TCimXmlLoader::FindLayout(const char* className)
 
 TCimXmlLoader::TLayout* TCimXmlLoader::AddLayout(const char* className, const boost::shared_ptr<TInMemClass>& cls)
 {
+    fStaging.KeepStaticValues(*cls);
     auto layout = std::make_unique<TLayout>();
     layout->cls = cls;
     layout->positions.resize(cls->GetSlotCount());

@@ -57,7 +57,8 @@ inline std::string System()
 inline std::string Document(const std::string& contents, const std::string& ns = std::string())
 {
     return "<CIM CIMVERSION=\"2.0\" DTDVERSION=\"2.0\"><DECLARATION><DECLGROUP>" + ns +
-           "<QUALIFIER.DECLARATION NAME=\"Key\" TYPE=\"boolean\"/><QUALIFIER.DECLARATION NAME=\"Static\" TYPE=\"boolean\"/>\n" +
+           "<QUALIFIER.DECLARATION NAME=\"Key\" TYPE=\"boolean\"/><QUALIFIER.DECLARATION NAME=\"Static\" TYPE=\"boolean\"/>"
+           "<QUALIFIER.DECLARATION NAME=\"EmbeddedInstance\" TYPE=\"string\"/>\n" +
            contents + "</DECLGROUP></DECLARATION></CIM>\n";
 }
 
