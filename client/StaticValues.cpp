@@ -8,7 +8,7 @@ bool DiffersIn(const TInMemNamespace& other, const TInMemClass& cls, TInMemPrope
 {
     const boost::shared_ptr<TInMemClass> counterpart = other.FindClass(cls.GetName());
     const boost::shared_ptr<TInMemPropertyDecl> there = counterpart ? counterpart->FindPropertyDecl(decl.GetName()) : nullptr;
-    return there && there->IsStatic() && there->GetStaticProperty().GetValue() != decl.GetStaticProperty().GetValue();
+    return there && (!there->IsStatic() || there->GetStaticProperty().GetValue() != decl.GetStaticProperty().GetValue());
 }
 
 }  // namespace

@@ -5,7 +5,6 @@
 
 #include "client/CimWalk.h"
 #include "embedded/TInMemProperty.h"
-#include "embedded/TInMemStaticProperty.h"
 
 namespace NORVZEL20 {
 
@@ -15,12 +14,8 @@ namespace {
 TCIMValue ValueBefore(const ICIMInstance& instance, const std::string& property)
 {
     const boost::shared_ptr<ICIMProperty> handle = instance.GetProperty(property, TCallContext());
-    const TCIMValue* earlier = nullptr;
-    if (const auto* stored = dynamic_cast<const TInMemProperty*>(handle.get())) {
-        earlier = stored->GetEarlierValue();
-    } else if (const auto* ofClass = dynamic_cast<const TInMemStaticProperty*>(handle.get())) {
-        earlier = ofClass->GetEarlierValue();
-    }
+    const TInMemProperty* stored = dynamic_cast<const TInMemProperty*>(handle.get());
+    const TCIMValue* earlier = stored == nullptr ? nullptr : stored->GetEarlierValue();
     return earlier == nullptr ? handle->GetValue(TCallContext()) : *earlier;
 }
 

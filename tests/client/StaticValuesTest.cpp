@@ -34,6 +34,27 @@ TEST_F(StaticValuesTest, EveryInstanceOfAPairShowsTheValueBefore)
               Compare(Disks("old"), Disks("old")));
 }
 
+TEST_F(StaticValuesTest, APropertyMayBeStaticInOneInventoryAlone)
+{
+    const std::string ordinary =
+        Document(System() + Class("Disk", "", KeyProperty("Id") + Declaration("Firmware", "string")) +
+                 Instance("Disk", Value("Id", "0") + Value("Firmware", "x")) +
+                 Instance("Disk", Value("Id", "1") + Value("Firmware", "y")) + Instance("Disk", Value("Id", "2")));
+    EXPECT_EQ("3 differences between a and b: 3 changed values in 3 instances\n"
+              "\n"
+              "Disk\n"
+              "~ Id=\"0\"\n"
+              "    Firmware: old -> x\n"
+              "~ Id=\"1\"\n"
+              "    Firmware: old -> y\n"
+              "~ Id=\"2\"\n"
+              "    Firmware: old -> NULL\n"
+              "\n"
+              "Compared: 2 classes; 4 instances of a, 4 instances of b.\n",
+              Compare(Disks("old"), ordinary));
+    EXPECT_NE(std::string::npos, Compare(ordinary, Disks("old")).find("    Firmware: y -> old\n"));
+}
+
 TEST_F(StaticValuesTest, SoDoesEveryInstanceOfThree)
 {
     const std::string old = Scratch("a.xml", Disks("old"));
