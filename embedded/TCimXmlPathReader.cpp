@@ -93,7 +93,8 @@ void TCimXmlPathReader::FailTooDeep() const
 const std::string& TCimXmlPathReader::FindOnlyKey(const TInMemClass* cls) const
 {
     if (cls == nullptr || cls->GetKeySlots().size() != 1)
-        fContext.Fail(EStatus::kParseError, "found a key value without a name, expected it in a <KEYBINDING> that names the key");
+        fContext.Fail(EStatus::kParseError, "found a key value without a name, expected it in a <KEYBINDING> that names the key"
+                                            " (or a class with one key, declared in front of it)");
     return cls->GetSlotDecl(cls->GetKeySlots().front()).GetName();
 }
 

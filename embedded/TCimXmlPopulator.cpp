@@ -88,7 +88,7 @@ class TLoad {
 
     void Finish()
     {
-        fLoader.Finish([this](const TCIMValue& value) { return fReader.ReadObjects(value); });
+        fContext.Guard([this] { fLoader.Finish([this](const TCIMValue& value) { return fReader.ReadObjects(value); }); });
     }
 
     /// Nothing can fail from here on.

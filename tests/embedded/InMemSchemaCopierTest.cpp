@@ -109,6 +109,20 @@ TEST_F(InMemSchemaCopierTest, AnInheritedNameIsRespelledByOverridingIt)
     EXPECT_EQ(sda, target->FindInstance(Path("Disk.Id=\"sda\",Room=\"Room\"")));
 }
 
+TEST_F(InMemSchemaCopierTest, AKeyOfSeveralReferencesStaysFoundToo)
+{
+    const auto room = target->AllocateInMemClass("room", nullptr);
+    room->AddToNamespace(none);
+    const auto door = target->AllocateInMemClass("Door", nullptr);
+    door->AddPropertyDecl(Decl({"Between", TType::kArrayReference, {"Key"}}));
+    door->AddToNamespace(none);
+    TCIMReference path;
+    path.SetClass(room);
+    const auto instance = Add(door, {{"Between", TCIMValue(TType::kArrayReference, 1, {TCIMValue(path)})}});
+    EXPECT_TRUE(copier.RespellClass("ROOM"));
+    EXPECT_EQ(instance, target->FindInstance(instance->GetReference()));
+}
+
 TEST_F(InMemSchemaCopierTest, AStaticPropertyKeepsItsValueWhenItIsRespelled)
 {
     device->AddPropertyDecl(Decl({"Version", TType::kString, {"Static"}}));
