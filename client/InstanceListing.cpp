@@ -74,6 +74,12 @@ std::string WriteDocuments(const TJson& documents, const std::string& format)
     return lines;
 }
 
+// Without it, a reference into another namespace could be taken for one into the copy's own.
+std::string NamespaceNameOf(const TInventory& inventory)
+{
+    return inventory.loaded.namesNamespace ? inventory.loaded.namespaceName : std::string();
+}
+
 void WriteClassWithSuperclasses(TCimXmlWriter& writer, const TInMemClass& cls, std::set<const TInMemClass*>& written)
 {
     if (!written.insert(&cls).second) {
@@ -85,11 +91,12 @@ void WriteClassWithSuperclasses(TCimXmlWriter& writer, const TInMemClass& cls, s
     writer.WriteClass(cls);
 }
 
-std::string InstancesAsCimXml(TInMemNamespace& ns, const std::vector<boost::shared_ptr<ICIMInstance>>& instances)
+std::string InstancesAsCimXml(const TInventory& inventory, const std::vector<boost::shared_ptr<ICIMInstance>>& instances)
 {
     std::string text;
     TCimXmlWriter writer([&text](std::string_view piece) { text += piece; });
-    writer.StartDocument();
+    writer.StartDocument(NamespaceNameOf(inventory), inventory.loaded.host);
+    TInMemNamespace& ns = *inventory.ns;
     for (const boost::shared_ptr<TInMemQualifierDecl>& decl : ns.GetQualifierDecls()) {
         writer.WriteQualifierDecl(*decl);
     }
@@ -104,11 +111,11 @@ std::string InstancesAsCimXml(TInMemNamespace& ns, const std::vector<boost::shar
     return text;
 }
 
-std::string NamespaceAsCimXml(TInMemNamespace& ns)
+std::string NamespaceAsCimXml(const TInventory& inventory)
 {
     std::string text;
     TCimXmlWriter writer([&text](std::string_view piece) { text += piece; });
-    writer.WriteNamespace(ns);
+    writer.WriteNamespace(*inventory.ns, NamespaceNameOf(inventory), inventory.loaded.host);
     return text;
 }
 
@@ -146,11 +153,11 @@ TJson ClassesAsJson(TInMemNamespace& ns)
 
 }  // namespace
 
-std::string WriteInstances(TInMemNamespace& ns, const std::vector<boost::shared_ptr<ICIMInstance>>& instances,
+std::string WriteInstances(const TInventory& inventory, const std::vector<boost::shared_ptr<ICIMInstance>>& instances,
                            const std::vector<std::string>& properties, const std::string& format)
 {
     if (format == "cimxml") {
-        return InstancesAsCimXml(ns, instances);
+        return InstancesAsCimXml(inventory, instances);
     }
     if (format == "text") {
         std::string text;
@@ -166,12 +173,12 @@ std::string WriteInstances(TInMemNamespace& ns, const std::vector<boost::shared_
     return WriteDocuments(documents, format);
 }
 
-std::string WriteClasses(TInMemNamespace& ns, const std::string& format)
+std::string WriteClasses(const TInventory& inventory, const std::string& format)
 {
     if (format == "cimxml") {
-        return NamespaceAsCimXml(ns);
+        return NamespaceAsCimXml(inventory);
     }
-    return format == "text" ? ClassesAsText(ns) : WriteDocuments(ClassesAsJson(ns), format);
+    return format == "text" ? ClassesAsText(*inventory.ns) : WriteDocuments(ClassesAsJson(*inventory.ns), format);
 }
 
 }  // namespace NORVZEL20

@@ -4,7 +4,7 @@
 #include <string>
 #include <vector>
 
-#include "embedded/TInMemNamespace.h"
+#include "client/TInventory.h"
 #include "host/ICIMInstance.h"
 
 namespace NORVZEL20 {
@@ -12,11 +12,12 @@ namespace NORVZEL20 {
 /// Instances as `query` and `show` write them, in the order given.
 ///
 /// `format` is text, json, ndjson or cimxml. `properties` names those to be written, in their order; empty stands for all. CIM-XML
-/// has whole instances, with their classes and those above them, so that it loads again. Errors: TZELException of the namespace.
-std::string WriteInstances(TInMemNamespace& ns, const std::vector<boost::shared_ptr<ICIMInstance>>& instances,
+/// has whole instances, with their classes and those above them and the namespace's name, so that it loads again. Errors:
+/// TZELException of the namespace.
+std::string WriteInstances(const TInventory& inventory, const std::vector<boost::shared_ptr<ICIMInstance>>& instances,
                            const std::vector<std::string>& properties, const std::string& format);
 
-/// The classes of a namespace with the numbers of their instances; in CIM-XML the whole namespace.
-std::string WriteClasses(TInMemNamespace& ns, const std::string& format);
+/// The classes of an inventory with the numbers of their instances; in CIM-XML the whole inventory.
+std::string WriteClasses(const TInventory& inventory, const std::string& format);
 
 }  // namespace NORVZEL20

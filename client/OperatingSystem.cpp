@@ -3,8 +3,11 @@
 #include <algorithm>
 
 #include "client/CimWalk.h"
+#include "client/TClientError.h"
+#include "client/TypeName.h"
 #include "embedded/TSchemaCopier.h"
 #include "host/TCIMDateTime.h"
+#include "host/TZELException.h"
 
 namespace NORVZEL20 {
 
@@ -84,12 +87,44 @@ void AddProperty(TInMemNamespace& ns, TInMemClass& cls, const char* name, TCIMVa
     cls.AddPropertyDecl(decl);
 }
 
+[[noreturn]] void Refuse(const TInventory& inventory, const std::string& reason)
+{
+    throw TClientError(inventory.path + ": has no instance of " + kOperatingSystemClass +
+                       ", which a comparison needs, and none can be made: " + reason + "; add one to the inventory");
+}
+
+// What a declaration of the class fails on: a property that a superclass there declares with another type.
+std::string DescribeConflict(const TInMemClass& declared, const TInMemNamespace& ns)
+{
+    for (const TInMemClass* cls = &declared; cls != nullptr; cls = cls->GetSuperInMemClass().get()) {
+        const boost::shared_ptr<TInMemClass> super =
+            cls->GetSuperInMemClass() ? ns.FindClass(cls->GetSuperInMemClass()->GetName()) : nullptr;
+        for (const boost::shared_ptr<TInMemPropertyDecl>& own : cls->GetOwnPropertyDecls()) {
+            const boost::shared_ptr<TInMemPropertyDecl> above = super ? super->FindPropertyDecl(own->GetName()) : nullptr;
+            if (above && above->GetType() != own->GetType()) {
+                return "property " + own->GetName() + " of " + cls->GetName() + " is " + TypeName(own->GetType()) + " there, but " +
+                       super->GetName() + " declares it as " + TypeName(above->GetType()) + " here";
+            }
+        }
+    }
+    return "the declarations do not fit together";
+}
+
+boost::shared_ptr<TInMemClass> DeclareAs(const TInventory& source, const TInMemClass& declared, const TInventory& inventory)
+{
+    try {
+        TSchemaCopier(inventory.ns).CopyClass(declared);
+    } catch (const TZELException&) {
+        Refuse(inventory, "the class cannot be declared as in " + source.path + ", " + DescribeConflict(declared, *inventory.ns));
+    }
+    return inventory.ns->FindClass(kOperatingSystemClass);
+}
+
 boost::shared_ptr<TInMemClass> DeclareClass(const std::vector<TInventory>& inventories, const TInventory& inventory)
 {
     for (const TInventory& other : inventories) {
         if (const boost::shared_ptr<TInMemClass> declared = other.ns->FindClass(kOperatingSystemClass)) {
-            TSchemaCopier(inventory.ns).CopyClass(*declared);
-            return inventory.ns->FindClass(kOperatingSystemClass);
+            return DeclareAs(other, *declared, inventory);
         }
     }
     const boost::shared_ptr<TInMemClass> cls =
@@ -139,14 +174,30 @@ TCIMValue SomeValue(TCIMValue::TCIMType type, const std::string& className)
     }
 }
 
-void AddInstance(TInMemNamespace& ns, TInMemClass& cls)
+void AddTypeProperty(const TInventory& inventory, TInMemClass& cls)
 {
+    for (const boost::shared_ptr<TInMemClass>& below : cls.GetClassesBelow()) {
+        const boost::shared_ptr<TInMemPropertyDecl> other = below->FindPropertyDecl(kTypeProperty);
+        if (other && other->GetType() != TCIMValue::TCIMType::kUint16) {
+            Refuse(inventory, "property " + other->GetName() + " of " + below->GetName() + " is " + TypeName(other->GetType()) +
+                                  " instead of uint16");
+        }
+    }
+    AddProperty(*inventory.ns, cls, kTypeProperty, TCIMValue::TCIMType::kUint16, false);
+}
+
+void AddInstance(const TInventory& inventory, TInMemClass& cls)
+{
+    TInMemNamespace& ns = *inventory.ns;
     if (!cls.FindPropertyDecl(kTypeProperty)) {
-        AddProperty(ns, cls, kTypeProperty, TCIMValue::TCIMType::kUint16, false);
+        AddTypeProperty(inventory, cls);
     }
     const TSystem system = Describe(ns);
     const boost::shared_ptr<TInMemInstance> instance = cls.AllocateInMemInstance();
     for (const std::uint32_t slot : cls.GetKeySlots()) {
+        if (cls.GetSlotDecl(slot).GetType().IsArray()) {
+            Refuse(inventory, "its key " + cls.GetSlotDecl(slot).GetName() + " is an array");
+        }
         instance->SetSlot(slot, SomeValue(cls.GetSlotDecl(slot).GetType(), cls.GetName()));
     }
     const std::uint32_t name = cls.FindSlot(kNameProperty);
@@ -166,15 +217,18 @@ std::vector<TSchemaNote> MakeMissingOperatingSystems(std::vector<TInventory>& in
 {
     std::vector<TSchemaNote> notes;
     for (std::size_t i = 0; i < inventories.size(); ++i) {
-        TInMemNamespace& ns = *inventories[i].ns;
-        boost::shared_ptr<TInMemClass> cls = ns.FindClass(kOperatingSystemClass);
+        boost::shared_ptr<TInMemClass> cls = inventories[i].ns->FindClass(kOperatingSystemClass);
         if (cls && cls->GetInstanceCount() > 0) {
             continue;
         }
         if (!cls) {
             cls = DeclareClass(inventories, inventories[i]);
         }
-        AddInstance(ns, *cls);
+        try {
+            AddInstance(inventories[i], *cls);
+        } catch (const TZELException& error) {
+            Refuse(inventories[i], error.what());
+        }
         notes.push_back({TSchemaNote::kOperatingSystemMade, i, i, kOperatingSystemClass, std::string(), std::string()});
     }
     return notes;

@@ -15,7 +15,8 @@ extern const char* const kOperatingSystemClass;
 ///
 /// Class and instance are made after those of another inventory where there is one, else with the key Name and OSType alone. OSType
 /// and Name are those of the inventory's instance of (a class below) CIM_OperatingSystem, else 0 and "unknown".
-/// Returns a note for each instance made. Errors: TZELException of the namespaces.
+/// Returns a note for each instance made. Errors: TClientError where the class cannot be declared in an inventory
+/// as in another one, or has keys that no value can be made for.
 std::vector<TSchemaNote> MakeMissingOperatingSystems(std::vector<TInventory>& inventories);
 
 }  // namespace NORVZEL20

@@ -18,7 +18,7 @@ int RunQuery(const TQueryOptions& options, IConsole& console)
         const TInventory inventory = TInventoryLoader(console).LoadOne(options.inventory);
         std::vector<boost::shared_ptr<ICIMInstance>> instances;
         query.Execute(*inventory.ns, TAddToVectorCallback<ICIMInstance>(&instances));
-        DeliverResult(console, options.output, WriteInstances(*inventory.ns, instances, query.GetProperties(), options.format));
+        DeliverResult(console, options.output, WriteInstances(inventory, instances, query.GetProperties(), options.format));
     } catch (const TQueryError& error) {
         throw TClientError(error.what());
     }

@@ -20,7 +20,7 @@ std::string WriteClass(const TInventory& inventory, const TShowOptions& options)
     }
     std::vector<boost::shared_ptr<ICIMInstance>> instances;
     cls->EnumerateInstances(TAddToVectorCallback<ICIMInstance>(&instances), true, TCallContext());
-    return WriteInstances(*inventory.ns, instances, {}, options.format);
+    return WriteInstances(inventory, instances, {}, options.format);
 }
 
 }  // namespace
@@ -29,7 +29,7 @@ int RunShow(const TShowOptions& options, IConsole& console)
 {
     const TInventory inventory = TInventoryLoader(console).LoadOne(options.inventory);
     DeliverResult(console, options.output,
-                  options.className.empty() ? WriteClasses(*inventory.ns, options.format) : WriteClass(inventory, options));
+                  options.className.empty() ? WriteClasses(inventory, options.format) : WriteClass(inventory, options));
     return 0;
 }
 

@@ -4,6 +4,7 @@
 
 #include "client/CompleteInventories.h"
 #include "client/MadeRules.h"
+#include "client/StaticValues.h"
 #include "client/TClientError.h"
 #include "client/TComparisonFault.h"
 #include "client/TCoverageBuilder.h"
@@ -125,11 +126,14 @@ void TComparison::FindDifferences(TDeltaNamespace& records, TRules& rules)
     }
 }
 
-// A pair's reference takes over the other one's values on the way. Where keys or types differ it cannot; the other one then counts
-// twice, since three inventories are left as they are.
+// A pair's reference takes over the other one's values on the way. Where keys or types differ it cannot, and a static value it
+// takes over for all instances at once; the other one then counts twice, since three inventories are left as they are.
 bool TComparison::MustBeLeftAsItIs() const
 {
-    return fInventories.size() == 2 && std::any_of(fNotes.begin(), fNotes.end(), [](const TSchemaNote& note) {
+    if (fInventories.size() != 2) {
+        return false;
+    }
+    return StaticValuesDiffer(fInventories) || std::any_of(fNotes.begin(), fNotes.end(), [](const TSchemaNote& note) {
                return note.kind == TSchemaNote::kTypeDiffers || note.kind == TSchemaNote::kKeysDiffer;
            });
 }

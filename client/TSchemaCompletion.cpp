@@ -1,9 +1,13 @@
 #include "client/TSchemaCompletion.h"
 
 #include <algorithm>
+#include <set>
+#include <tuple>
 
 #include "client/TClientError.h"
+#include "client/TypeName.h"
 #include "embedded/TNameText.h"
+#include "embedded/TReferenceAdapter.h"
 #include "embedded/TSchemaCopier.h"
 #include "host/TZELException.h"
 
@@ -19,6 +23,19 @@ std::vector<std::string> KeysInLowerCase(const TInMemClass& cls)
     }
     std::sort(keys.begin(), keys.end());
     return keys;
+}
+
+/// Why a property cannot be declared in `cls`: what declares it otherwise.
+std::string DescribeConflict(const TInMemClass& cls, const TInMemPropertyDecl& property)
+{
+    for (const boost::shared_ptr<TInMemClass>& below : cls.GetClassesBelow()) {
+        const boost::shared_ptr<TInMemPropertyDecl> other = below->FindPropertyDecl(property.GetName());
+        if (other && other->GetType() != property.GetType()) {
+            return "class " + below->GetName() + " below it has one of that name with the type " + TypeName(other->GetType()) +
+                   " instead of " + TypeName(property.GetType());
+        }
+    }
+    return "the declarations do not fit together";
 }
 
 }  // namespace
@@ -37,6 +54,8 @@ std::vector<TSchemaNote> TSchemaCompletion::Run()
             }
         }
     }
+    AdaptReferences();
+    SortNotes();
     return fNotes;
 }
 
@@ -53,13 +72,11 @@ void TSchemaCompletion::Spread(std::size_t source, const TInMemClass& cls, std::
             Note(TSchemaNote::kKeysDiffer, target, source, cls.GetName(), std::string());
         }
     }
-    TSchemaCopier copier(fInventories[target].ns);
     for (const std::uint32_t slot : cls.GetSlotOrder()) {
         const TInMemPropertyDecl& property = cls.GetSlotDecl(slot);
         const boost::shared_ptr<TInMemPropertyDecl> counterpart = there->FindPropertyDecl(property.GetName());
         if (!counterpart) {
-            copier.CopyPropertyDecl(property, *there);
-            Note(TSchemaNote::kPropertyDeclared, target, source, cls.GetName(), property.GetName());
+            DeclareProperty(source, property, target, *there);
         } else if (target > source && counterpart->GetType() != property.GetType()) {
             Note(TSchemaNote::kTypeDiffers, target, source, cls.GetName(), property.GetName());
         }
@@ -77,6 +94,19 @@ void TSchemaCompletion::Declare(std::size_t source, const TInMemClass& cls, std:
                            " cannot be declared here: " + error.what() +
                            "; a superclass has a property of another type in the two inventories");
     }
+}
+
+void TSchemaCompletion::DeclareProperty(std::size_t source, const TInMemPropertyDecl& property, std::size_t target,
+                                        TInMemClass& there)
+{
+    try {
+        TSchemaCopier(fInventories[target].ns).CopyPropertyDecl(property, there);
+    } catch (const TZELException&) {
+        throw TClientError(fInventories[target].path + ": property " + property.GetName() + " of class " + there.GetName() +
+                           " of " + fInventories[source].path + " cannot be declared here: " + DescribeConflict(there, property) +
+                           "; give them one type in both inventories, or another name");
+    }
+    Note(TSchemaNote::kPropertyDeclared, target, source, there.GetName(), property.GetName());
 }
 
 void TSchemaCompletion::Respell(std::size_t source, const TInMemClass& cls, std::size_t target)
@@ -101,6 +131,32 @@ void TSchemaCompletion::Note(TSchemaNote::EKind kind, std::size_t target, std::s
                              const std::string& property, const std::string& before)
 {
     fNotes.push_back({kind, target, source, className, property, before});
+}
+
+/// Stored references name classes and keys; where declarations changed, those are written anew.
+void TSchemaCompletion::AdaptReferences()
+{
+    std::set<std::size_t> changed;
+    for (const TSchemaNote& note : fNotes) {
+        if (note.kind != TSchemaNote::kTypeDiffers && note.kind != TSchemaNote::kKeysDiffer) {
+            changed.insert(note.inventory);
+        }
+    }
+    for (const std::size_t inventory : changed) {
+        const std::string twice = TReferenceAdapter::AdaptAll(*fInventories[inventory].ns);
+        if (!twice.empty()) {
+            throw TClientError(fInventories[inventory].path + ": has two instances " + twice +
+                               " once names are spelled and keys are declared as in the other inventories; remove one of them");
+        }
+    }
+}
+
+void TSchemaCompletion::SortNotes()
+{
+    const auto key = [](const TSchemaNote& note) {
+        return std::tie(note.source, note.className, note.inventory, note.kind, note.property);
+    };
+    std::sort(fNotes.begin(), fNotes.end(), [&](const TSchemaNote& a, const TSchemaNote& b) { return key(a) < key(b); });
 }
 
 }  // namespace NORVZEL20

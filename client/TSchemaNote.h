@@ -14,7 +14,7 @@ struct TSchemaNote {
         kClassRespelled,       ///< a class got another inventory's letter case
         kPropertyRespelled,    ///< a property got another inventory's letter case
         kOperatingSystemMade,  ///< the inventory had no instance of KALMO_OperatingSystem
-        kTypeDiffers,          ///< a property has another type than in `source`: its values never count as equal
+        kTypeDiffers,          ///< a property has another type than in `source`: its values count as equal only where both are null
         kKeysDiffer            ///< a class has other keys than in `source`: nothing matches unless rules exclude those
     };
 

@@ -150,7 +150,7 @@ class TStatement {
             return "Made in " + Label(note.inventory) + ": an instance of " + element;
         case TSchemaNote::kTypeDiffers:
             return "Of another type in " + Label(note.inventory) + " than in " + Label(note.source) +
-                   ", so never equal: " + element;
+                   ", so equal only where both are NULL: " + element;
         case TSchemaNote::kKeysDiffer:
             return "Identified by other keys in " + Label(note.inventory) + " than in " + Label(note.source) + ": " + element +
                    "; instances match only under rules that exclude the keys that not both have";

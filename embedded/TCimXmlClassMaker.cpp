@@ -34,6 +34,7 @@ boost::shared_ptr<TInMemClass> TCimXmlClassMaker::Make(const TCimXmlDraft& draft
     if (HasTooManySuperClasses(super.get()))
         fContext.Fail(EStatus::kParseError, "found class " + TCimXmlContext::Quote(object.GetClassName()) + " below more than " +
                                                 std::to_string(kMaxSuperClasses) + " superclasses; flatten the class tree");
+    fContext.CheckName("class", object.GetClassName());
     const boost::shared_ptr<TInMemClass> cls = fNamespace.AllocateInMemClass(object.GetClassName(), super);
     AddQualifiers(*cls, object.GetQualifiers(), super ? &super->GetQualifiers() : nullptr);
     for (std::size_t index = 0; index < object.GetProperties().size(); ++index) {
@@ -47,6 +48,7 @@ boost::shared_ptr<TInMemClass> TCimXmlClassMaker::Make(const TCimXmlDraft& draft
 
 void TCimXmlClassMaker::AddProperty(TInMemClass& cls, const TEmbeddedObject::TProperty& property, const TInMemClass* super)
 {
+    fContext.CheckName("property", property.fName);
     const TCIMValue::TCIMType type = property.fValue.GetType();
     const boost::shared_ptr<TInMemPropertyDecl> inherited =
         super != nullptr ? super->FindPropertyDecl(property.fName) : boost::shared_ptr<TInMemPropertyDecl>();

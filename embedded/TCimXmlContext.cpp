@@ -53,6 +53,17 @@ bool TCimXmlContext::IsOwn(const std::string& name, const std::string& host) con
     return host.empty() || fReport.host.empty() || TNameText::Equal(host, fReport.host);
 }
 
+void TCimXmlContext::CheckName(const char* what, std::string_view name) const
+{
+    const auto isPart = [](char c) {
+        const char lower = TNameText::ToLower(c);
+        return (lower >= 'a' && lower <= 'z') || (c >= '0' && c <= '9') || c == '_' || static_cast<unsigned char>(c) >= 0x80;
+    };
+    if (!std::all_of(name.begin(), name.end(), isPart))
+        Fail(TZELStatusCode::kParseError,
+             std::string("found ") + what + " " + Quote(name) + ", expected a name of letters, digits and underscores");
+}
+
 std::string TCimXmlContext::Quote(std::string_view text)
 {
     constexpr std::size_t kLongest = 80;

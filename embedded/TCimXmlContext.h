@@ -63,6 +63,23 @@ class TCimXmlContext {
     /// How many embedded objects are being read, one within the other.
     std::size_t fEmbeddedDepth = 0;
 
+    /// Fails with status 9 where `name` is none that a path can hold: of letters, digits and underscores, or beyond ASCII. `what`
+    /// says what it is the name of.
+    void CheckName(const char* what, std::string_view name) const;
+
+    /// Does something that the namespace or a value may refuse; that then ends the load, at this place.
+    template <class TAct>
+    auto Guard(TAct act) const -> decltype(act())
+    {
+        try {
+            return act();
+        } catch (const TPopulateError&) {
+            throw;
+        } catch (const TZELException& error) {
+            Fail(error.GetStatusCode().GetStatus(), std::string("found what cannot be taken: ") + error.what());
+        }
+    }
+
     /// Text for a message: in double quotes, cut where it is long, control characters shown as dots.
     static std::string Quote(std::string_view text);
 

@@ -5,6 +5,7 @@
 
 #include "embedded/TCimXmlClassMaker.h"
 #include "embedded/TCimXmlObjects.h"
+#include "embedded/TReferenceAdapter.h"
 #include "embedded/TValueText.h"
 
 namespace NORVZEL20 {
@@ -96,8 +97,10 @@ void TCimXmlLoader::DeclareClass(std::size_t number)
         if (!super && !waiting.draft.object.GetSuperClassName().empty())
             continue;
         const TCimXmlContext::TAt at(fContext, waiting.draft.place);
-        super = TCimXmlClassMaker(fContext, *fNamespace).Make(waiting.draft, super);
-        fStaging.AddClass(super);
+        fContext.Guard([&] {
+            super = TCimXmlClassMaker(fContext, *fNamespace).Make(waiting.draft, super);
+            fStaging.AddClass(super);
+        });
         waiting.state = TClassDraft::kDeclared;
         fDeclaredLate = fDeclaredLate || fNumber > 0 || fDeferring;
     }
@@ -120,6 +123,7 @@ TCimXmlLoader::TLayout* TCimXmlLoader::FindLayout(const char* className)
 
 TCimXmlLoader::TLayout* TCimXmlLoader::AddLayout(const char* className, const boost::shared_ptr<TInMemClass>& cls)
 {
+    fStaging.KeepStaticValues(*cls);
     auto layout = std::make_unique<TLayout>();
     layout->cls = cls;
     layout->positions.resize(cls->GetSlotCount());
@@ -148,6 +152,7 @@ void TCimXmlLoader::BeginInstance(TLayout& layout)
     fLayout = &layout;
     fInstance = layout.cls->AllocateInMemInstance();
     fExpected = 0;
+    fMustHold = false;
     ++fNumber;
 }
 
@@ -177,8 +182,10 @@ void TCimXmlLoader::SetProperty(const TTarget& target, TCIMValue&& value, bool m
     if (value.GetType() != target.type)
         value = Convert(target, value);
     fInstance->SetSlot(target.slot, std::move(value));
-    if (metUnknownClass)
-        fUnresolved.emplace_back(fInstance, target.slot);
+    if (!metUnknownClass)
+        return;
+    fUnresolved.emplace_back(fInstance, target.slot);
+    fMustHold = fMustHold || fLayout->cls->GetSlotDecl(target.slot).IsKey();
 }
 
 TCIMValue TCimXmlLoader::Convert(const TTarget& target, const TCIMValue& value)
@@ -202,15 +209,24 @@ void TCimXmlLoader::EndInstance(const TOwnKeys* ownKeys)
 {
     if (ownKeys != nullptr && fInstance->FindMissingKey() != nullptr)
         FillKeys(*ownKeys);
-    try {
-        fStaging.AddInstance(fInstance);
-    } catch (const TZELException& error) {
-        Explain(error);
-    }
+    fLayout->isHeld = !fEnded && (fLayout->isHeld || fMustHold);
+    if (fLayout->isHeld)
+        fHeld.push_back({fInstance, fContext.GetPlace()});
+    else
+        Add(fInstance);
     ++fContext.GetReport().instances;
     if (fKeep)
         fKeptInstances.push_back(fInstance);
     fInstance.reset();
+}
+
+void TCimXmlLoader::Add(const boost::shared_ptr<TInMemInstance>& instance)
+{
+    try {
+        fStaging.AddInstance(instance);
+    } catch (const TZELException& error) {
+        Explain(error, *instance);
+    }
 }
 
 /// Takes keys that an instance leaves out from the name in front of it.
@@ -223,22 +239,24 @@ void TCimXmlLoader::FillKeys(const TOwnKeys& keys)
         const TInMemPropertyDecl& decl = fLayout->cls->GetSlotDecl(slot);
         TCIMValue converted = value;
         TValueText::Convert(value, decl.GetType(), converted);  // where it cannot be, setting it says so
-        SetProperty({&decl.GetName(), slot, decl.GetType(), false}, std::move(converted), false);
+        TReferenceAdapter(*fNamespace).Adapt(converted);        // the name was read before classes in front of it were declared
+        const bool isReference = decl.GetType() == TCIMValue::TCIMType::kReference;  // perhaps to a class that is not known yet
+        SetProperty({&decl.GetName(), slot, decl.GetType(), false}, std::move(converted), isReference);
         fContext.Tolerate("key from name", "an instance of class " + Quote(fLayout->cls->GetName()) + " leaves out its key " +
                                                Quote(name) + "; taken from the name in front of it");
     }
 }
 
-void TCimXmlLoader::Explain(const TZELException& error) const
+void TCimXmlLoader::Explain(const TZELException& error, const TInMemInstance& instance) const
 {
     const EStatus status = error.GetStatusCode().GetStatus();
-    const std::string ofClass = " of class " + Quote(fLayout->cls->GetName());
+    const std::string ofClass = " of class " + Quote(instance.GetInMemClass()->GetName());
     if (status == EStatus::kAlreadyExists)
-        fContext.Fail(status, "found a second instance " + fInstance->GetReference().GetPath() + "; instances" + ofClass +
+        fContext.Fail(status, "found a second instance " + instance.GetReference().GetPath() + "; instances" + ofClass +
                                   " must differ in their keys");
     if (status == EStatus::kKeyMissing)
-        fContext.Fail(status, "found an instance" + ofClass + " without a value for its key " +
-                                  Quote(*fInstance->FindMissingKey()) + "; every key needs one");
+        fContext.Fail(status, "found an instance" + ofClass + " without a value for its key " + Quote(*instance.FindMissingKey()) +
+                                  "; every key needs one");
     fContext.Fail(status, "found an instance" + ofClass + " that cannot be added: " + error.what());
 }
 
@@ -247,7 +265,15 @@ void TCimXmlLoader::AddInstance(TCimXmlDraft draft)
     fWaiting.push_back(std::move(draft));
 }
 
-void TCimXmlLoader::AddWaiting(const TCimXmlDraft& draft)
+void TCimXmlLoader::AddHeld()
+{
+    for (const THeld& held : std::exchange(fHeld, {})) {
+        const TCimXmlContext::TAt at(fContext, held.place);
+        Add(held.instance);
+    }
+}
+
+void TCimXmlLoader::AddWaiting(const TCimXmlDraft& draft, const TReadObjects& readObjects)
 {
     const TCimXmlContext::TAt at(fContext, draft.place);
     const TEmbeddedObject& object = draft.object;
@@ -256,24 +282,30 @@ void TCimXmlLoader::AddWaiting(const TCimXmlDraft& draft)
         fContext.Fail(EStatus::kNotFound, "found an instance of class " + Quote(object.GetClassName()) +
                                               ", which is not declared; add its <CLASS> to the document or load it before");
     BeginInstance(*layout);
+    const TReferenceAdapter adapter(*fNamespace);
     for (std::size_t index = 0; index < object.GetProperties().size(); ++index) {
         const TCimXmlContext::TAt atProperty(fContext, draft.propertyPlaces[index]);
         const TEmbeddedObject::TProperty& property = object.GetProperties()[index];
-        SetProperty(FindProperty(property.fName.c_str()), TCIMValue(property.fValue), true);
+        const TTarget target = FindProperty(property.fName.c_str());
+        TCIMValue value = target.isEmbedded ? readObjects(property.fValue) : property.fValue;
+        adapter.Adapt(value);
+        SetProperty(target, std::move(value), false);
     }
     EndInstance(&draft.ownKeys);
 }
 
-void TCimXmlLoader::Finish()
+void TCimXmlLoader::Finish(const TReadObjects& readObjects)
 {
+    fEnded = true;
     DeclareClasses();
     for (const TClassDraft& cls : fClasses)
         if (cls.state != TClassDraft::kDeclared)
             RefuseClass(cls.draft);
-    for (TCimXmlDraft& draft : std::exchange(fWaiting, {}))
-        AddWaiting(draft);
     if (fDeclaredLate)
         ResolveReferences();
+    AddHeld();
+    for (const TCimXmlDraft& draft : std::exchange(fWaiting, {}))
+        AddWaiting(draft, readObjects);
 }
 
 void TCimXmlLoader::RefuseClass(const TCimXmlDraft& draft) const
@@ -286,26 +318,14 @@ void TCimXmlLoader::RefuseClass(const TCimXmlDraft& draft) const
     fContext.Fail(EStatus::kNotFound, found + ", which is not declared; add its <CLASS> to the document or load it before");
 }
 
-/// Gives references their classes that were declared only after them.
+/// Writes references as their classes say that were declared only after them.
 void TCimXmlLoader::ResolveReferences()
 {
-    const auto resolve = [&](const TCIMValue& value) {
-        if (value.IsNull() || value.GetType() != TCIMValue::TCIMType::kReference)
-            return value;
-        TCIMReference path = value;
-        if (const boost::shared_ptr<TInMemClass> cls = fNamespace->FindClass(path.GetClassName()))
-            path.SetClass(cls);
-        return TCIMValue(path);
-    };
-    for (const auto& [instance, slot] : fUnresolved) {
-        const TCIMValue& value = instance->GetSlotValue(slot);
-        if (value.IsNull() || value.GetType() == TCIMValue::TCIMType::kReference) {
-            instance->SetSlot(slot, resolve(value));
-        } else if (value.GetType() == TCIMValue::TCIMType::kArrayReference) {
-            std::vector<TCIMValue> elements = value.GetElements();
-            std::transform(elements.begin(), elements.end(), elements.begin(), resolve);
-            instance->SetSlot(slot, TCIMValue(value.GetType(), static_cast<unsigned int>(elements.size()), elements));
-        }
+    const TReferenceAdapter adapter(*fNamespace);
+    for (const auto& [instance, slot] : std::exchange(fUnresolved, {})) {
+        TCIMValue value = instance->GetSlotValue(slot);
+        if (adapter.Adapt(value))
+            instance->SetSlot(slot, std::move(value));
     }
 }
 

@@ -1,5 +1,6 @@
 #pragma once
 
+#include <boost/function.hpp>
 #include <boost/smart_ptr/shared_ptr.hpp>
 #include <cstdint>
 #include <memory>
@@ -20,10 +21,14 @@ namespace NORVZEL20 {
 ///
 /// Classes wait until they are needed or the document ends, so that they may come in any order. An instance is filled directly,
 /// property by property, where its class is known; otherwise it waits as a draft until the document ends, and so do those after it.
+/// One whose keys refer to a class that is not known yet is filled but waits too, and so do those of its class after it: what it is
+/// called depends on that class.
 /// Errors: every operation but Commit fails through the context.
 class TCimXmlLoader {
   public:
     using TOwnKeys = std::vector<std::pair<std::string, TCIMValue>>;
+    /// Reads those texts of a value that are embedded objects.
+    using TReadObjects = boost::function<TCIMValue(const TCIMValue&)>;
 
     /// A property of the instance being filled.
     struct TTarget {
@@ -48,7 +53,7 @@ class TCimXmlLoader {
     void AddInstance(TCimXmlDraft draft);
 
     /// The document has ended: adds what waits.
-    void Finish();
+    void Finish(const TReadObjects& readObjects);
     void Commit() noexcept { fStaging.Commit(); }
 
     void KeepElements() { fKeep = true; }
@@ -69,6 +74,12 @@ class TCimXmlLoader {
         std::vector<bool> embedded;            // see TTarget
         std::vector<std::uint32_t> positions;  // in order of declaration
         std::vector<std::uint32_t> given;      // the number of the last instance that told it
+        bool isHeld = false;                   // its instances wait
+    };
+
+    struct THeld {
+        boost::shared_ptr<TInMemInstance> instance;
+        TCimXmlContext::TPlace place;
     };
 
     void DeclareClasses();
@@ -79,8 +90,10 @@ class TCimXmlLoader {
     void BeginInstance(TLayout& layout);
     TCIMValue Convert(const TTarget& target, const TCIMValue& value);
     void FillKeys(const TOwnKeys& keys);
-    [[noreturn]] void Explain(const TZELException& error) const;
-    void AddWaiting(const TCimXmlDraft& draft);
+    void Add(const boost::shared_ptr<TInMemInstance>& instance);
+    [[noreturn]] void Explain(const TZELException& error, const TInMemInstance& instance) const;
+    void AddHeld();
+    void AddWaiting(const TCimXmlDraft& draft, const TReadObjects& readObjects);
     void ResolveReferences();
 
     TCimXmlContext& fContext;
@@ -88,6 +101,7 @@ class TCimXmlLoader {
     TInMemStaging fStaging;
     std::vector<TClassDraft> fClasses;
     TNameMap<std::size_t> fClassNumbers;
+    std::vector<THeld> fHeld;                     // instances
     std::vector<TCimXmlDraft> fWaiting;           // instances
     TNameMap<std::unique_ptr<TLayout>> fLayouts;  // by class name
     TLayout* fLayout = nullptr;                   // of the instance being filled, or the last one
@@ -95,8 +109,10 @@ class TCimXmlLoader {
     std::uint32_t fNumber = 0;  // of the instance
     std::size_t fExpected = 0;  // the position of the property that is likely to come next
     std::vector<std::pair<boost::shared_ptr<TInMemInstance>, std::uint32_t>> fUnresolved;
+    bool fMustHold = false;      // a key of the instance refers to a class that is not known yet
     bool fNewClasses = false;    // some have not been tried yet
     bool fDeferring = false;     // instances wait
+    bool fEnded = false;         // all classes are known, or will never be
     bool fDeclaredLate = false;  // a class was declared after the first instance
     bool fKeep = false;
     std::vector<boost::shared_ptr<ICIMElement>> fKeptInstances;

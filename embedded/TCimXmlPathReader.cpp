@@ -1,13 +1,16 @@
 #include "embedded/TCimXmlPathReader.h"
 
+#include <cstring>
+
 #include "embedded/TNameText.h"
+#include "embedded/TReferenceAdapter.h"
 #include "embedded/TValueText.h"
 
 namespace NORVZEL20 {
 
 namespace {
 
-// What a path of the host holds; the object's own path counts.
+// As deep as a path of the host may hold others, the object's own counted.
 constexpr std::size_t kMaxDepth = 12;
 
 using EStatus = TZELStatusCode::EStatusCode;
@@ -28,16 +31,16 @@ TCimXmlPathReader::TCimXmlPathReader(TCimXmlContext& context, boost::shared_ptr<
 
 void TCimXmlPathReader::Begin()
 {
-    if (fDepth == kMaxDepth)
-        fContext.Fail(EStatus::kParseError,
-                      "found object paths within each other more than " + std::to_string(kMaxDepth) + " deep, expected fewer");
-    if (++fDepth > fFrames.size())
+    if (++fDepth > kMaxDepth)
+        FailTooDeep();
+    if (fDepth > fFrames.size())
         fFrames.emplace_back();
     TFrame& frame = fFrames[fDepth - 1];
     frame.namespaceName.clear();
     frame.host.clear();
     frame.className.clear();
     frame.keyName.clear();
+    frame.isInBinding = false;
     frame.keys.clear();
 }
 
@@ -51,6 +54,7 @@ TCIMReference TCimXmlPathReader::End()
     if (cls) {
         path.SetClass(cls);
     } else {
+        fContext.CheckName("class", frame.className);
         path.SetClassName(frame.className);
         fMetUnknownClass = true;
     }
@@ -60,29 +64,37 @@ TCIMReference TCimXmlPathReader::End()
     }
     for (const auto& [declared, value] : frame.keys) {
         std::string name = declared.empty() ? FindOnlyKey(cls.get()) : declared;
-        const TCIMValue adapted = cls ? Adapt(*cls, name, value) : value;
-        path.AddKeyValue(name, adapted);
+        TCIMValue adapted = value;
+        if (!cls || TReferenceAdapter::AdaptKey(*cls, name, adapted) == nullptr)
+            fContext.CheckName("key", name);
+        AddKeyTo(path, name, adapted);
     }
+    if (path.GetKeyCount() < frame.keys.size())
+        fContext.Fail(EStatus::kParseError, "found a key a second time in one path, expected each once");
     return path;
 }
 
-/// The value in the declared type of the key where that loses nothing; the name in its declared spelling.
-TCIMValue TCimXmlPathReader::Adapt(const TInMemClass& cls, std::string& name, const TCIMValue& value) const
+void TCimXmlPathReader::AddKeyTo(TCIMReference& path, const std::string& name, const TCIMValue& value) const
 {
-    const std::uint32_t slot = cls.FindSlot(name);
-    if (slot == TInMemClass::kNoSlot)
-        return value;
-    const TInMemPropertyDecl& decl = cls.GetSlotDecl(slot);
-    name = decl.GetName();
-    TCIMValue adapted;
-    return value.GetType() != decl.GetType() && TValueText::Convert(value, decl.GetType(), adapted) ? adapted : value;
+    try {
+        path.AddKeyValue(name, value);
+    } catch (const TZELException&) {
+        FailTooDeep();
+    }
+}
+
+void TCimXmlPathReader::FailTooDeep() const
+{
+    fContext.Fail(EStatus::kParseError,
+                  "found object paths within each other more than " + std::to_string(kMaxDepth) + " deep, expected fewer");
 }
 
 /// The key that a value without a name belongs to.
 const std::string& TCimXmlPathReader::FindOnlyKey(const TInMemClass* cls) const
 {
     if (cls == nullptr || cls->GetKeySlots().size() != 1)
-        fContext.Fail(EStatus::kParseError, "found a key value without a name, expected it in a <KEYBINDING> that names the key");
+        fContext.Fail(EStatus::kParseError, "found a key value without a name, expected it in a <KEYBINDING> that names the key"
+                                            " (or a class with one key, declared in front of it)");
     return cls->GetSlotDecl(cls->GetKeySlots().front()).GetName();
 }
 
@@ -113,11 +125,15 @@ void TCimXmlPathReader::AddNamespace(const char* name)
 {
     if (!fNamespaceName.empty())
         fNamespaceName += '/';
+    if (std::strpbrk(name, ":=\"") != nullptr)
+        fContext.Fail(EStatus::kParseError, "found namespace " + TCimXmlContext::Quote(name) + ", expected a name without \":=");
     fNamespaceName += name;
 }
 
 void TCimXmlPathReader::SetHost(std::string_view host)
 {
+    if (!fHost.empty() || host.find('/') != std::string_view::npos)
+        fContext.Fail(EStatus::kParseError, "found host " + TCimXmlContext::Quote(host) + ", expected one, without a slash");
     fHost = host;
 }
 
@@ -127,18 +143,33 @@ void TCimXmlPathReader::EndNamespacePath()
         fContext.NoteNamespace(fNamespaceName, fHost);
         return;
     }
+    if (!fFrames[fDepth - 1].namespaceName.empty())
+        fContext.Fail(EStatus::kParseError, "found a second namespace in one path, expected one");
     fFrames[fDepth - 1].namespaceName = fNamespaceName;
     fFrames[fDepth - 1].host = fHost;
 }
 
 void TCimXmlPathReader::SetClassName(const char* name)
 {
+    if (!fFrames[fDepth - 1].className.empty())
+        fContext.Fail(EStatus::kParseError, "found a second path where one is expected");
     fFrames[fDepth - 1].className = name;
 }
 
 void TCimXmlPathReader::BeginKeyBinding(const char* name)
 {
     fFrames[fDepth - 1].keyName = name;
+    fFrames[fDepth - 1].isInBinding = true;
+}
+
+void TCimXmlPathReader::EndKeyBinding()
+{
+    TFrame& frame = fFrames[fDepth - 1];
+    if (!frame.keyName.empty())
+        fContext.Fail(EStatus::kParseError,
+                      "found key " + TCimXmlContext::Quote(frame.keyName) +
+                          " without a value, expected a <KEYVALUE> or a <VALUE.REFERENCE> in its <KEYBINDING>");
+    frame.isInBinding = false;
 }
 
 void TCimXmlPathReader::BeginKeyValue(const TCimXmlAttributes& attributes)
@@ -155,6 +186,8 @@ void TCimXmlPathReader::EndKeyValue(std::string_view text)
 void TCimXmlPathReader::AddKey(TCIMValue value)
 {
     TFrame& frame = fFrames[fDepth - 1];
+    if (frame.isInBinding && frame.keyName.empty())
+        fContext.Fail(EStatus::kParseError, "found a second value in one <KEYBINDING>, expected one");
     frame.keys.emplace_back(frame.keyName, std::move(value));
     frame.keyName.clear();
 }

@@ -38,6 +38,7 @@ class TCimXmlPathReader {
 
     void SetClassName(const char* name);
     void BeginKeyBinding(const char* name);
+    void EndKeyBinding();
     void BeginKeyValue(const TCimXmlAttributes& attributes);
     void EndKeyValue(std::string_view text);
     void AddKey(TCIMValue value);
@@ -50,19 +51,23 @@ class TCimXmlPathReader {
 
     /// Whether End met a class that is not declared since this was last asked.
     bool TakeMetUnknownClass() noexcept { return std::exchange(fMetUnknownClass, false); }
+    /// For paths that another reader has read.
+    void NoteUnknownClass() noexcept { fMetUnknownClass = true; }
 
   private:
     struct TFrame {
         std::string namespaceName;
         std::string host;
         std::string className;
-        std::string keyName;
+        std::string keyName;       // of the KEYBINDING that is open and has no value yet
+        bool isInBinding = false;  // one is open
         std::vector<std::pair<std::string, TCIMValue>> keys;
     };
 
     boost::shared_ptr<TInMemClass> FindClass(const std::string& name);
     TCIMValue ReadKey(std::string_view text);
-    TCIMValue Adapt(const TInMemClass& cls, std::string& name, const TCIMValue& value) const;
+    void AddKeyTo(TCIMReference& path, const std::string& name, const TCIMValue& value) const;
+    [[noreturn]] void FailTooDeep() const;
     const std::string& FindOnlyKey(const TInMemClass* cls) const;
 
     TCimXmlContext& fContext;

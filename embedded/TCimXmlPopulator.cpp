@@ -86,7 +86,10 @@ class TLoad {
 
     TCimXmlLoader& GetLoader() noexcept { return fLoader; }
 
-    void Finish() { fLoader.Finish(); }
+    void Finish()
+    {
+        fContext.Guard([this] { fLoader.Finish([this](const TCIMValue& value) { return fReader.ReadObjects(value); }); });
+    }
 
     /// Nothing can fail from here on.
     TLoadReport Commit() noexcept

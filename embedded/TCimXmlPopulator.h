@@ -15,13 +15,14 @@ namespace NORVZEL20 {
 
 /// Loads CIM-XML documents (DSP0201) into a namespace: declarations in any kind of group, and recorded requests and responses.
 ///
-/// Classes may come in any order, and instances before their class. A property that an instance does not mention is null there. A
-/// reference without a namespace, or to the document's own namespace (and host), is stored without one.
-/// Each load is all or nothing: where it throws, the namespace is as it was.
-/// Errors of every load: TPopulateError with the statuses of TNamespacePopulator::PopulateFromXMLFile, 31 where the namespace is
-/// none of the provider "inmem"; std::bad_alloc. Nothing is logged. Threads: one at a time for each populator and namespace;
-/// several populators may work at once on namespaces of their own. Cost: one pass over the document; it is never held whole,
-/// but LoadFromMemory has the XML library copy it.
+/// Classes may come in any order, and instances before their class; references are written as their classes are declared, wherever
+/// that stands. Only a key that a path tells without its name needs the class in front of it. Names of classes, properties and keys
+/// are of letters, digits, underscores and what is beyond ASCII, so that a path tells them apart. A property that an instance does
+/// not mention is null there. A reference without a namespace, or to the document's own namespace (and host), is stored without
+/// one. Each load is all or nothing: where it throws, the namespace is as it was. Errors of every load: TPopulateError with the
+/// statuses of TNamespacePopulator::PopulateFromXMLFile, 31 where the namespace is none of the provider "inmem"; std::bad_alloc.
+/// Nothing is logged. Threads: one at a time for each populator and namespace; several populators may work at once on namespaces of
+/// their own. Cost: one pass over the document; it is never held whole, but LoadFromMemory has the XML library copy it.
 class TCimXmlPopulator {
   public:
     /// Fills the buffer with at most so many bytes and returns how many; 0 ends the document, and is asked for once. May deliver as

@@ -5,6 +5,7 @@
 #include <cstring>
 #include <utility>
 
+#include "embedded/TValueAccess.h"
 #include "embedded/TValueText.h"
 
 namespace NORVZEL20 {
@@ -24,6 +25,13 @@ std::string Quote(std::string_view text)
 bool IsBlank(char c)
 {
     return c == ' ' || c == '\n' || c == '\t' || c == '\r';
+}
+
+/// Whether text that may be an embedded object is one: writers that do not mark those write plain text beside them.
+bool LooksLikeObject(std::string_view text)
+{
+    const auto start = std::find_if_not(text.begin(), text.end(), IsBlank);
+    return start != text.end() && *start == '<';
 }
 
 bool IsMarkedEmbedded(const TCimXmlAttributes& attributes)
@@ -49,6 +57,8 @@ class TCimXmlReader::TEmbedded {
                           "found " + Quote(text) + ", expected an <INSTANCE> or a <CLASS> (" + fXml.GetError() + ")");
         return fSink.TakeObject();
     }
+
+    bool TakeMetUnknownClass() noexcept { return fSink.fPaths.TakeMetUnknownClass(); }
 
   private:
     TCimXmlContext& fContext;
@@ -85,7 +95,7 @@ void TCimXmlReader::OnStart(const char* name, const char** attributes)
         FailUnexpected(name);
     fOpen.push_back({step.next, element});
     fText = std::string_view();
-    Begin(step.action, TCimXmlAttributes(attributes));
+    fContext.Guard([&] { Begin(step.action, TCimXmlAttributes(attributes)); });
 }
 
 void TCimXmlReader::OnEnd(const char*)
@@ -93,18 +103,8 @@ void TCimXmlReader::OnEnd(const char*)
     CheckBlank();
     const TTable::EAction action = TTable::GetEndAction(GetState());
     fOpen.pop_back();
-    End(action);
+    fContext.Guard([&] { End(action); });
     fText = std::string_view();
-}
-
-void TCimXmlReader::FailUnexpected(const char* name) const
-{
-    const TOpen& open = fOpen.back();
-    const std::string place = open.element == TElement::kUnknown ? " as the outermost element"
-                                                                 : std::string(" in <") + TElement::GetName(open.element) + ">";
-    const std::string shown = Quote(name);
-    fContext.Fail(EStatus::kParseError, "found element <" + shown.substr(1, shown.size() - 2) + ">" + place + ", expected " +
-                                            TTable::DescribeExpected(open.state));
 }
 
 /// Text where only elements may stand must be white space.
@@ -117,23 +117,6 @@ void TCimXmlReader::CheckBlank() const
                                                 ">, expected elements alone");
 }
 
-const char* TCimXmlReader::Require(const TCimXmlAttributes& attributes, const char* name) const
-{
-    const char* value = attributes.Find(name);
-    if (value == nullptr || *value == '\0')
-        fContext.Fail(EStatus::kParseError, std::string("found <") + TElement::GetName(fOpen.back().element) + "> without " + name +
-                                                ", expected that attribute with a value");
-    return value;
-}
-
-TType TCimXmlReader::ReadType(const char* text) const
-{
-    const TType type = TValueText::FindType(text);
-    if (type == TType::kNone)
-        fContext.Fail(EStatus::kParseError, "found type " + Quote(text) + ", expected a CIM type such as string or uint32");
-    return type;
-}
-
 void TCimXmlReader::Begin(TTable::EAction action, const TCimXmlAttributes& attributes)
 {
     switch (action) {
@@ -142,8 +125,7 @@ void TCimXmlReader::Begin(TTable::EAction action, const TCimXmlAttributes& attri
     case TTable::kBeginText:
         return BeginValue();
     case TTable::kBeginArray:
-        BeginValue();
-        return fElements.clear();
+        return BeginArray();
     case TTable::kAddNull:
         return fElements.push_back(TCIMValue::Null(fItem->type.GetElementType()));
     case TTable::kBeginInstance:
@@ -184,6 +166,8 @@ void TCimXmlReader::End(TTable::EAction action)
         return EndReference();
     case TTable::kEndKeyValue:
         return fPaths.EndKeyValue(fText);
+    case TTable::kEndKeyBinding:
+        return fPaths.EndKeyBinding();
     case TTable::kEndHost:
         return fPaths.SetHost(fText);
     case TTable::kEndNamespacePath:
@@ -303,6 +287,15 @@ void TCimXmlReader::BeginValue()
     fItem->isGiven = true;
 }
 
+void TCimXmlReader::BeginArray()
+{
+    BeginValue();
+    fElements.clear();
+    if (GetState() == TTable::kReferenceArray && fItem->type.GetElementType() != TType::kReference)
+        fContext.Fail(EStatus::kTypeMismatch, "found an array of references as value of " + Quote(fItem->name) + ", expected a " +
+                                                  TValueText::GetTypeName(fItem->type) + "[]");
+}
+
 /// What a value belongs to is the innermost element that is open when it has ended.
 void TCimXmlReader::EndText()
 {
@@ -350,14 +343,24 @@ void TCimXmlReader::MakeValue(std::string_view text, TCIMValue& value)
                                                   TValueText::GetTypeName(type));
 }
 
-/// Whether the text is that of an embedded object. Writers that do not mark those write plain text into their properties too.
 bool TCimXmlReader::IsObject(std::string_view text) const
 {
-    if (fItem->text == TItem::kPerhapsObject) {
-        const auto start = std::find_if_not(text.begin(), text.end(), IsBlank);
-        return start != text.end() && *start == '<';
-    }
+    if (fItem->text == TItem::kPerhapsObject)
+        return LooksLikeObject(text);
     return fItem->text == TItem::kObject && !text.empty();
+}
+
+TCIMValue TCimXmlReader::ReadObjects(const TCIMValue& value)
+{
+    if (value.IsNull())
+        return value;
+    if (value.GetType().IsArray()) {
+        std::vector<TCIMValue> elements;
+        for (const TCIMValue& element : value.GetElements())
+            elements.push_back(ReadObjects(element));
+        return TCIMValue(value.GetType(), static_cast<unsigned int>(elements.size()), elements);
+    }
+    return TValueAccess::IsText(value) && LooksLikeObject(value.GetString()) ? MakeObject(value.GetString()) : value;
 }
 
 TCIMValue TCimXmlReader::MakeObject(std::string_view text)
@@ -369,6 +372,8 @@ TCIMValue TCimXmlReader::MakeObject(std::string_view text)
     ++fContext.fEmbeddedDepth;
     TCIMValue value(fEmbedded->Read(text));
     --fContext.fEmbeddedDepth;
+    if (fEmbedded->TakeMetUnknownClass())
+        fPaths.NoteUnknownClass();
     return value;
 }
 

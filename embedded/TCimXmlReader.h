@@ -30,6 +30,9 @@ class TCimXmlReader : public TXmlReader::ISink {
     void OnEnd(const char* name) override;
     void OnText(const char* text, std::size_t length) override { fText = std::string_view(text, length); }
 
+    /// The value with those of its texts read that are embedded objects, for a property that its declaration says holds such.
+    TCIMValue ReadObjects(const TCIMValue& value);
+
     /// Starts over, for another embedded object.
     void Reset();
     /// The embedded object that was read. Errors: fails with status 13 where there is none.
@@ -91,6 +94,7 @@ class TCimXmlReader : public TXmlReader::ISink {
     void BeginValue();
     void EndText();
     void EndReference();
+    void BeginArray();
     void EndArray();
     void MakeValue(std::string_view text, TCIMValue& value);
     bool IsObject(std::string_view text) const;

@@ -3,7 +3,9 @@
 #include <boost/smart_ptr/make_shared.hpp>
 #include <utility>
 
-// What TCimXmlReader does for declarations and for the frames of messages.
+#include "embedded/TValueText.h"
+
+// What TCimXmlReader does for declarations and for the frames of messages, and what it says of what it cannot read.
 namespace NORVZEL20 {
 
 using EStatus = TZELStatusCode::EStatusCode;
@@ -143,6 +145,34 @@ void TCimXmlReader::NoteSkipped()
 {
     const char* name = TElement::GetName(fOpen.back().element);
     fContext.Tolerate(name, std::string("<") + name + "> holds no class or instance; left out");
+}
+
+void TCimXmlReader::FailUnexpected(const char* name) const
+{
+    const TOpen& open = fOpen.back();
+    const std::string place = open.element == TElement::kUnknown ? " as the outermost element"
+                                                                 : std::string(" in <") + TElement::GetName(open.element) + ">";
+    const std::string shown = TCimXmlContext::Quote(name);
+    fContext.Fail(EStatus::kParseError, "found element <" + shown.substr(1, shown.size() - 2) + ">" + place + ", expected " +
+                                            TTable::DescribeExpected(open.state));
+}
+
+const char* TCimXmlReader::Require(const TCimXmlAttributes& attributes, const char* name) const
+{
+    const char* value = attributes.Find(name);
+    if (value == nullptr || *value == '\0')
+        fContext.Fail(EStatus::kParseError, std::string("found <") + TElement::GetName(fOpen.back().element) + "> without " + name +
+                                                ", expected that attribute with a value");
+    return value;
+}
+
+TType TCimXmlReader::ReadType(const char* text) const
+{
+    const TType type = TValueText::FindType(text);
+    if (type == TType::kNone)
+        fContext.Fail(EStatus::kParseError,
+                      "found type " + TCimXmlContext::Quote(text) + ", expected a CIM type such as string or uint32");
+    return type;
 }
 
 }  // namespace NORVZEL20

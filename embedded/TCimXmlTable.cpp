@@ -174,6 +174,7 @@ constexpr std::array<T::EAction, T::kStateCount> MakeEndActions()
     actions[T::kNamespacePath] = T::kEndNamespacePath;
     actions[T::kLocalNamespacePath] = T::kEndNamespacePath;
     actions[T::kHost] = T::kEndHost;
+    actions[T::kKeyBinding] = T::kEndKeyBinding;
     actions[T::kKeyValue] = T::kEndKeyValue;
     return actions;
 }

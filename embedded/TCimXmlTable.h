@@ -94,6 +94,7 @@ class TCimXmlTable {
         kEndHost,
         kReadClassName,
         kBeginKeyBinding,
+        kEndKeyBinding,
         kBeginKeyValue,
         kEndKeyValue,
         kReadError,

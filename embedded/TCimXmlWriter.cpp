@@ -33,9 +33,14 @@ void AppendScope(std::string& out, TDecl::EScope scope)
     out += "/>";
 }
 
-/// The parts of a namespace's name, each in an element of its own.
-void AppendNamespacePath(std::string& out, const std::string& name)
+/// The parts of a namespace's name, each in an element of its own, after the host where there is one.
+void AppendNamespacePath(std::string& out, const std::string& name, const std::string& host)
 {
+    if (!host.empty()) {
+        out += "<NAMESPACEPATH><HOST>";
+        TValueXml::AppendEscaped(out, host);
+        out += "</HOST>";
+    }
     out += "<LOCALNAMESPACEPATH>";
     for (std::size_t start = 0; start <= name.size();) {
         const std::size_t end = std::min(name.find('/', start), name.size());
@@ -44,7 +49,7 @@ void AppendNamespacePath(std::string& out, const std::string& name)
         out += "/>";
         start = end + 1;
     }
-    out += "</LOCALNAMESPACEPATH>\n";
+    out += host.empty() ? "</LOCALNAMESPACEPATH>\n" : "</LOCALNAMESPACEPATH></NAMESPACEPATH>\n";
 }
 
 void AppendQualifierDecl(std::string& out, const ICIMQualifierDecl& decl)
@@ -82,9 +87,9 @@ void AppendInstance(std::string& out, const ICIMInstance& instance)
 
 TCimXmlWriter::TCimXmlWriter(TSink sink) : fSink(std::move(sink)) {}
 
-void TCimXmlWriter::WriteNamespace(ICIMNamespace& ns, const std::string& namespaceName)
+void TCimXmlWriter::WriteNamespace(ICIMNamespace& ns, const std::string& namespaceName, const std::string& host)
 {
-    StartDocument(namespaceName);
+    StartDocument(namespaceName, host);
     const auto writeDecl = [&](const boost::shared_ptr<ICIMQualifierDecl>& decl) {
         WriteQualifierDecl(*decl);
         return true;
@@ -118,12 +123,12 @@ std::vector<boost::shared_ptr<ICIMClass>> TCimXmlWriter::CollectClasses(ICIMName
     return classes;
 }
 
-void TCimXmlWriter::StartDocument(const std::string& namespaceName)
+void TCimXmlWriter::StartDocument(const std::string& namespaceName, const std::string& host)
 {
     fBuffer.clear();  // of what a document that failed may have left
     fBuffer += "<?xml version=\"1.0\" encoding=\"utf-8\"?>\n<CIM CIMVERSION=\"2.0\" DTDVERSION=\"2.0\"><DECLARATION><DECLGROUP>\n";
     if (!namespaceName.empty())
-        AppendNamespacePath(fBuffer, namespaceName);
+        AppendNamespacePath(fBuffer, namespaceName, host);
 }
 
 /// Appends what `append` appends, or, where that throws, nothing.

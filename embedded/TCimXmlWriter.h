@@ -27,11 +27,13 @@ class TCimXmlWriter {
     TCimXmlWriter& operator=(const TCimXmlWriter&) = delete;
 
     /// The whole document: CIM, DECLARATION and DECLGROUP with qualifier declarations, classes (superclasses first) and instances
-    /// (class by class in that order, each in order of insertion). `namespaceName` is named in the group where it is not empty.
-    void WriteNamespace(ICIMNamespace& ns, const std::string& namespaceName = std::string());
+    /// (class by class in that order, each in order of insertion). `namespaceName` is named in the group where it is not empty,
+    /// with `host` where that is not empty.
+    void WriteNamespace(ICIMNamespace& ns, const std::string& namespaceName = std::string(),
+                        const std::string& host = std::string());
 
     /// The parts, for documents put together by the caller: StartDocument, any number of the others, EndDocument.
-    void StartDocument(const std::string& namespaceName = std::string());
+    void StartDocument(const std::string& namespaceName = std::string(), const std::string& host = std::string());
     void WriteQualifierDecl(const ICIMQualifierDecl& decl);
     /// One VALUE.OBJECT with the CLASS: its own qualifiers, and the properties and methods that it declares itself.
     void WriteClass(const ICIMClass& cls);

@@ -182,6 +182,11 @@ void TInMemInstance::SetSlot(std::uint32_t slot, TCIMValue value)
     Change(GetSlotProperty(slot), std::move(value));
 }
 
+void TInMemInstance::Rewrite(std::uint32_t slot, TCIMValue value)
+{
+    GetSlotProperty(slot).fValue = fClass->GetSlotDecl(slot).Fit(std::move(value));
+}
+
 const std::string* TInMemInstance::FindMissingKey() const
 {
     for (const std::uint32_t slot : fClass->GetKeySlots()) {

@@ -49,6 +49,9 @@ class TInMemInstance final : public ICIMInstance, public boost::enable_shared_fr
     const TCIMValue& GetSlotValue(std::uint32_t slot) const;
     /// Sets the property in a slot as ICIMProperty::SetValue does, without looking up a name. Errors: status 13.
     void SetSlot(std::uint32_t slot, TCIMValue value);
+    /// Writes the value in a slot in another way that means the same, a key's too; the instance is then found by that. For whoever
+    /// tells the namespace (ReferenceTextsChanged). Not for static properties. Errors: status 13.
+    void Rewrite(std::uint32_t slot, TCIMValue value);
 
     /// Whether it is part of the namespace.
     bool IsAdded() const noexcept { return fAdded != 0; }

@@ -71,7 +71,7 @@ class TInMemNamespace final : public ICIMNamespace, public ILocated, public boos
     const std::vector<boost::shared_ptr<TInMemQualifierDecl>>& GetQualifierDecls() const noexcept { return fQualifierDecls; }
     /// Errors: status 12 where one of that name is declared.
     void AddQualifierDecl(boost::shared_ptr<TInMemQualifierDecl> decl);
-    /// Finds instances anew by keys that hold references, whose paths change with the spelling of a class.
+    /// Finds instances anew by keys that hold references, whose paths change with the spelling of a class and its keys.
     void ReferenceTextsChanged();
     /// The instance of that path, or null where there is none or no such class. Errors: status 13, 14.
     boost::shared_ptr<TInMemInstance> FindInstance(const TCIMReference& path) const;

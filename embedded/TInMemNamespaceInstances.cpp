@@ -90,7 +90,7 @@ void TInMemNamespace::ReferenceTextsChanged()
 {
     for (const auto& cls : fClasses) {
         for (const std::uint32_t slot : cls->GetKeySlots()) {
-            if (cls->GetSlotDecl(slot).GetType() == TCIMValue::TCIMType::kReference) {
+            if (cls->GetSlotDecl(slot).GetType().GetElementType() == TCIMValue::TCIMType::kReference) {
                 cls->GetExtent().KeysChanged();
                 break;
             }

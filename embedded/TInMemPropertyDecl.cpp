@@ -19,7 +19,7 @@ TInMemPropertyDecl::TInMemPropertyDecl(const std::string& name, const TCIMValue&
             fDefault = TCIMValue::Null(value.GetType());
         }
     }
-    fStaticProperty.fValue = fDefault;
+    fStaticProperty.fState.value = fDefault;
     UpdateMarks();
 }
 

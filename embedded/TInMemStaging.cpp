@@ -9,6 +9,9 @@ TInMemStaging::~TInMemStaging()
     if (fCommitted) {
         return;
     }
+    for (const auto& [key, kept] : fStaticValues) {
+        kept.decl->GetStaticProperty().SetState(kept.state);
+    }
     for (const auto& [extent, mark] : fExtents) {
         extent->RollBack(mark);
     }
@@ -55,6 +58,16 @@ TInMemExtent& TInMemStaging::Touch(TInMemClass& cls)
 void TInMemStaging::AddInstance(const boost::shared_ptr<TInMemInstance>& instance)
 {
     Touch(*instance->GetInMemClass()).Add(instance);
+}
+
+void TInMemStaging::KeepStaticValues(const TInMemClass& cls)
+{
+    for (const std::uint32_t slot : cls.GetSlotOrder()) {
+        const boost::shared_ptr<TInMemPropertyDecl>& decl = cls.GetSharedSlotDecl(slot);
+        if (decl->IsStatic()) {
+            fStaticValues.emplace(decl.get(), TStaticValue{decl, decl->GetStaticProperty().GetState()});
+        }
+    }
 }
 
 void TInMemStaging::Commit() noexcept

@@ -11,7 +11,8 @@ namespace NORVZEL20 {
 /// Adds many things to a namespace, all of them or none.
 ///
 /// What is added shows at once. Unless Commit is called, the destructor takes everything out again, and the namespace is as it was,
-/// generated numbers included; classes that were there must not be changed, and nothing removed, while a staging is open.
+/// generated numbers included; classes that were there must not be changed, except for static values that it was told to keep, and
+/// nothing removed, while a staging is open.
 /// Threads: as the namespace.
 class TInMemStaging {
   public:
@@ -29,16 +30,25 @@ class TInMemStaging {
     /// (FindMissingKey then tells its name), 15 where the class is not declared.
     void AddInstance(const boost::shared_ptr<TInMemInstance>& instance);
 
+    /// Keeps the values of the class's static properties as they are now, which filling its instances changes.
+    void KeepStaticValues(const TInMemClass& cls);
+
     void Commit() noexcept;
 
   private:
+    struct TStaticValue {
+        boost::shared_ptr<TInMemPropertyDecl> decl;
+        TInMemStaticProperty::TState state;
+    };
+
     TInMemExtent& Touch(TInMemClass& cls);
 
     boost::shared_ptr<TInMemNamespace> fNamespace;
     std::vector<boost::shared_ptr<TInMemQualifierDecl>> fQualifierDecls;
     std::vector<boost::shared_ptr<TInMemClass>> fClasses;
-    std::unordered_map<TInMemExtent*, TInMemExtent::TMark> fExtents;  // those that got instances, as they were before
-    TInMemExtent* fLast = nullptr;                                    // the extent of the last instance
+    std::unordered_map<TInMemExtent*, TInMemExtent::TMark> fExtents;            // those that got instances, as they were before
+    std::unordered_map<const TInMemPropertyDecl*, TStaticValue> fStaticValues;  // as they were before
+    TInMemExtent* fLast = nullptr;                                              // the extent of the last instance
     bool fCommitted = false;
 };
 

@@ -6,12 +6,12 @@ namespace NORVZEL20 {
 
 const TCIMValue& TInMemStaticProperty::GetValue(TCallContext) const
 {
-    return fValue;
+    return fState.value;
 }
 
 void TInMemStaticProperty::SetValue(const TCIMValue& value)
 {
-    fValue = TInMemPropertyDecl::WithoutClasses(fDecl.Fit(value));
+    fState.value = TInMemPropertyDecl::WithoutClasses(fDecl.Fit(value));
 }
 
 void TInMemStaticProperty::SetValue(const TCIMValue& value, TCallContext)
@@ -19,11 +19,19 @@ void TInMemStaticProperty::SetValue(const TCIMValue& value, TCallContext)
     SetValue(value);
 }
 
-void TInMemStaticProperty::MarkRemoved() {}
+void TInMemStaticProperty::MarkRemoved()
+{
+    fState.isRemoved = true;
+}
 
 void TInMemStaticProperty::MarkChanged(const TCIMValue& value)
 {
+    const TCIMValue before = fState.value;
     SetValue(value);
+    if (!fState.isChanged) {
+        fState.earlier = before;
+        fState.isChanged = true;
+    }
 }
 
 boost::shared_ptr<const ICIMPropertyDecl> TInMemStaticProperty::GetPropertyDecl(TCallContext) const

@@ -8,9 +8,17 @@ class TInMemPropertyDecl;
 
 /// The value of a static property, one for the class, its subclasses and all their instances. Lives in its declaration.
 ///
-/// It has no marks: MarkChanged sets the value, MarkRemoved does nothing.
+/// Its marks and its earlier value are one for all of them, too.
 class TInMemStaticProperty : public ICIMProperty {
   public:
+    /// All that changes.
+    struct TState {
+        TCIMValue value;
+        TCIMValue earlier;  ///< before the first MarkChanged
+        bool isChanged = false;
+        bool isRemoved = false;
+    };
+
     explicit TInMemStaticProperty(TInMemPropertyDecl& decl) noexcept : fDecl(decl) {}
     TInMemStaticProperty(const TInMemStaticProperty&) = delete;
     TInMemStaticProperty& operator=(const TInMemStaticProperty&) = delete;
@@ -21,14 +29,21 @@ class TInMemStaticProperty : public ICIMProperty {
     void MarkChanged(const TCIMValue& value) override;
     boost::shared_ptr<const ICIMPropertyDecl> GetPropertyDecl(TCallContext context) const override;
 
-    const TCIMValue& GetValue() const noexcept { return fValue; }
+    const TCIMValue& GetValue() const noexcept { return fState.value; }
     void SetValue(const TCIMValue& value);
+    bool IsChanged() const noexcept { return fState.isChanged; }
+    bool IsRemoved() const noexcept { return fState.isRemoved; }
+    /// What it held before the first MarkChanged; null where there was none.
+    const TCIMValue* GetEarlierValue() const noexcept { return fState.isChanged ? &fState.earlier : nullptr; }
+
+    const TState& GetState() const noexcept { return fState; }
+    void SetState(const TState& state) noexcept { fState = state; }
 
   private:
     friend class TInMemPropertyDecl;
 
     TInMemPropertyDecl& fDecl;
-    TCIMValue fValue;
+    TState fState;
 };
 
 }  // namespace NORVZEL20

@@ -80,10 +80,19 @@ bool TSchemaCopier::RespellClass(const std::string& name)
 bool TSchemaCopier::RespellProperty(TInMemClass& cls, const std::string& name)
 {
     const auto decl = cls.FindPropertyDecl(name);
-    if (!decl || decl->GetOwner().get() != &cls || decl->GetName() == name) {
+    if (!decl || decl->GetName() == name) {
         return false;
     }
-    decl->SetSpelling(name);
+    if (decl->GetOwner().get() == &cls) {
+        decl->SetSpelling(name);
+        return true;
+    }
+    const auto own = TDeclCopy::CopyProperty(*decl);
+    own->SetSpelling(name);
+    if (own->IsStatic()) {
+        own->GetStaticProperty().SetValue(decl->GetStaticProperty().GetValue());
+    }
+    cls.AddPropertyDecl(own);
     return true;
 }
 

@@ -29,7 +29,8 @@ class TSchemaCopier {
 
     /// Gives the target's class, where it has one, the spelling `name`; false where it is spelled so, or there is none.
     bool RespellClass(const std::string& name);
-    /// The same for a property that `cls` itself declares or overrides.
+    /// The same for a property of `cls`. One that it inherits keeps its spelling above: `cls` overrides it, all else the same.
+    /// References keep their texts; see TReferenceAdapter.
     bool RespellProperty(TInMemClass& cls, const std::string& name);
 
   private:

@@ -183,20 +183,25 @@ std::string GetKindName(const char* base, TType type)
     return std::string(base) + (isReference ? (type.IsArray() ? ".REFARRAY" : ".REFERENCE") : (type.IsArray() ? ".ARRAY" : ""));
 }
 
+const TObject* AsObject(const TCIMValue& value)
+{
+    return TAccess::GetForm(value) == TAccess::kObject ? value.GetEmbeddedObject().get() : nullptr;
+}
+
+// An object in the value, where there is one and all other text is empty: a reader takes what is marked for objects alone.
 const TObject* FindObject(const TCIMValue& value)
 {
-    if (TAccess::GetForm(value) == TAccess::kObject) {
-        return value.GetEmbeddedObject().get();
-    }
     if (value.IsNull() || TType::ECIMType(value.GetType()) != TType::kArrayString) {
-        return nullptr;
+        return AsObject(value);
     }
+    const TObject* object = nullptr;
     for (const TCIMValue& element : value.GetElements()) {
-        if (const TObject* const object = FindObject(element)) {
-            return object;
+        if (TAccess::IsText(element) && !TAccess::GetText(element).empty()) {
+            return nullptr;
         }
+        object = object != nullptr ? object : AsObject(element);
     }
-    return nullptr;
+    return object;
 }
 
 void AppendParameter(std::string& out, const TObject::TParameter& parameter)

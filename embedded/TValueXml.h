@@ -35,7 +35,8 @@ class TValueXml {
 
     /// A whole QUALIFIER element, attributes that differ from their defaults alone.
     static void AppendQualifier(std::string& out, const TEmbeddedObject::TQualifier& qualifier);
-    /// PROPERTY, PROPERTY.ARRAY or PROPERTY.REFERENCE with qualifiers and value.
+    /// PROPERTY, PROPERTY.ARRAY or PROPERTY.REFERENCE with qualifiers and value. Embedded objects are marked, save in an array
+    /// where plain text stands beside them: there a qualifier of the declaration has to tell.
     static void AppendProperty(std::string& out, const TEmbeddedObject::TProperty& property);
     /// METHOD with qualifiers and parameters.
     static void AppendMethod(std::string& out, const TEmbeddedObject::TMethod& method);

@@ -72,21 +72,20 @@ TEST_F(FormatsTest, NotesOnTheSchemaAreInTheCoverage)
     }
     EXPECT_EQ("{\"kind\":\"operatingSystemMade\",\"inventory\":\"other-schema\",\"asIn\":\"other-schema\",\"class\":\"KALMO_"
               "OperatingSystem\"}\n"
+              "{\"kind\":\"classDeclared\",\"inventory\":\"other-schema\",\"asIn\":\"web01\",\"class\":\"INV_Disk\"}\n"
+              "{\"kind\":\"classDeclared\",\"inventory\":\"other-schema\",\"asIn\":\"web01\",\"class\":\"INV_Element\"}\n"
+              "{\"kind\":\"propertyDeclared\",\"inventory\":\"other-schema\",\"asIn\":\"web01\",\"class\":\"INV_Package\","
+              "\"property\":\"Depends\"}\n"
               "{\"kind\":\"classRespelled\",\"inventory\":\"other-schema\",\"asIn\":\"web01\",\"class\":\"INV_Package\",\"before\":"
               "\"inv_package\"}\n"
               "{\"kind\":\"propertyRespelled\",\"inventory\":\"other-schema\",\"asIn\":\"web01\",\"class\":\"INV_Package\","
-              "\"property\":\"Version\","
-              "\"before\":\"version\"}\n"
-              "{\"kind\":\"propertyDeclared\",\"inventory\":\"other-schema\",\"asIn\":\"web01\",\"class\":\"INV_Package\","
-              "\"property\":\"Depends\"}\n"
-              "{\"kind\":\"classDeclared\",\"inventory\":\"other-schema\",\"asIn\":\"web01\",\"class\":\"INV_Disk\"}\n"
-              "{\"kind\":\"classDeclared\",\"inventory\":\"other-schema\",\"asIn\":\"web01\",\"class\":\"INV_Element\"}\n"
+              "\"property\":\"Version\",\"before\":\"version\"}\n"
               "{\"kind\":\"classDeclared\",\"inventory\":\"other-schema\",\"asIn\":\"web01\",\"class\":\"INV_Service\"}\n"
-              "{\"kind\":\"classDeclared\",\"inventory\":\"web01\",\"asIn\":\"other-schema\",\"class\":\"CIM_OperatingSystem\"}\n"
               "{\"kind\":\"classDeclared\",\"inventory\":\"web01\",\"asIn\":\"other-schema\",\"class\":\"ACME_OperatingSystem\"}\n"
+              "{\"kind\":\"classDeclared\",\"inventory\":\"web01\",\"asIn\":\"other-schema\",\"class\":\"CIM_OperatingSystem\"}\n"
+              "{\"kind\":\"classDeclared\",\"inventory\":\"web01\",\"asIn\":\"other-schema\",\"class\":\"INV_Extra\"}\n"
               "{\"kind\":\"propertyDeclared\",\"inventory\":\"web01\",\"asIn\":\"other-schema\",\"class\":\"INV_Package\","
-              "\"property\":\"Vendor\"}\n"
-              "{\"kind\":\"classDeclared\",\"inventory\":\"web01\",\"asIn\":\"other-schema\",\"class\":\"INV_Extra\"}\n",
+              "\"property\":\"Vendor\"}\n",
               text);
 }
 

@@ -244,5 +244,25 @@ TEST_F(InMemInstanceTest, ANamespaceWithReferencesIntoItselfIsDestroyed)
     EXPECT_TRUE(watchedClass.expired());
 }
 
+TEST_F(InMemInstanceTest, AStaticPropertyIsMarkedForAllInstances)
+{
+    const auto cls = Declare("Model", nullptr, {{"Id", TType::kString, {"Key"}}, {"Firmware", TType::kString, {"Static"}}});
+    const auto one = Add(cls, {{"Id", "1"}, {"Firmware", "old"}});
+    const auto two = Add(cls, {{"Id", "2"}});
+    const auto ofTwo = two->GetProperty("Firmware", none);
+    const auto& stored = dynamic_cast<const TInMemStaticProperty&>(*ofTwo);
+    EXPECT_FALSE(stored.IsChanged());
+    EXPECT_EQ(nullptr, stored.GetEarlierValue());
+    EXPECT_EQ(13, StatusOf([&] { ofTwo->MarkChanged(TCIMValue(5)); }));
+    EXPECT_FALSE(stored.IsChanged());
+    one->GetProperty("Firmware", none)->MarkChanged(TCIMValue("new"));
+    one->GetProperty("Firmware", none)->MarkChanged(TCIMValue("newer"));
+    one->GetProperty("Firmware", none)->MarkRemoved();
+    EXPECT_EQ("newer", ofTwo->GetValue(none).ToText());
+    ASSERT_NE(nullptr, stored.GetEarlierValue());
+    EXPECT_EQ("old", stored.GetEarlierValue()->ToText());
+    EXPECT_TRUE(stored.IsRemoved());
+}
+
 }  // namespace
 }  // namespace NORVZEL20

@@ -91,8 +91,46 @@ TEST_F(InMemSchemaCopierTest, NamesAreRespelledAndReferencesStayFound)
     EXPECT_EQ(sda, target->FindInstance(sda->GetReference()));
     EXPECT_TRUE(copier.RespellProperty(*room, "NAME"));
     EXPECT_FALSE(copier.RespellProperty(*room, "NAME"));
-    EXPECT_FALSE(copier.RespellProperty(*target->FindClass("Disk"), "ID"));
+    EXPECT_FALSE(copier.RespellProperty(*room, "Floor"));
     EXPECT_EQ("other:Room.NAME=\"hall\"", hall->GetReference().GetPath());
+}
+
+TEST_F(InMemSchemaCopierTest, AnInheritedNameIsRespelledByOverridingIt)
+{
+    copier.CopyClass(*disk);
+    const auto copy = target->FindClass("Disk");
+    const auto sda = Add(copy, {{"Id", "sda"}, {"Room", TCIMValue(Path("Room"))}, {"Size", std::uint64_t(5)}});
+    EXPECT_TRUE(copier.RespellProperty(*copy, "ID"));
+    EXPECT_FALSE(copier.RespellProperty(*copy, "ID"));
+    EXPECT_EQ("Id", target->FindClass("Device")->FindPropertyDecl("id")->GetName());
+    EXPECT_EQ("Key", QualifiersOf(*copy->FindPropertyDecl("id")));
+    EXPECT_EQ("ID=sda Size=5 Room=Room", ValuesOf(*sda));
+    EXPECT_EQ("other:Disk.ID=\"sda\",Room=\"Room\"", sda->GetReference().GetPath());
+    EXPECT_EQ(sda, target->FindInstance(Path("Disk.Id=\"sda\",Room=\"Room\"")));
+}
+
+TEST_F(InMemSchemaCopierTest, AKeyOfSeveralReferencesStaysFoundToo)
+{
+    const auto room = target->AllocateInMemClass("room", nullptr);
+    room->AddToNamespace(none);
+    const auto door = target->AllocateInMemClass("Door", nullptr);
+    door->AddPropertyDecl(Decl({"Between", TType::kArrayReference, {"Key"}}));
+    door->AddToNamespace(none);
+    TCIMReference path;
+    path.SetClass(room);
+    const auto instance = Add(door, {{"Between", TCIMValue(TType::kArrayReference, 1, {TCIMValue(path)})}});
+    EXPECT_TRUE(copier.RespellClass("ROOM"));
+    EXPECT_EQ(instance, target->FindInstance(instance->GetReference()));
+}
+
+TEST_F(InMemSchemaCopierTest, AStaticPropertyKeepsItsValueWhenItIsRespelled)
+{
+    device->AddPropertyDecl(Decl({"Version", TType::kString, {"Static"}}));
+    copier.CopyClass(*disk);
+    const auto copy = target->FindClass("Disk");
+    copy->SetPropertyValue("Version", TCIMValue("1"), none);
+    EXPECT_TRUE(copier.RespellProperty(*copy, "VERSION"));
+    EXPECT_EQ("1", copy->GetProperty("Version", none)->GetValue(none).ToText());
 }
 
 }  // namespace

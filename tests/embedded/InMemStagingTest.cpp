@@ -71,6 +71,29 @@ TEST_F(InMemStagingTest, WhatWasTakenBackMayBeStagedAgain)
     EXPECT_EQ(3U, disk->GetInstanceCount());
 }
 
+TEST_F(InMemStagingTest, StaticValuesAreAsTheyWereToo)
+{
+    disk->AddPropertyDecl(Decl({"Firmware", TType::kString, {"Static"}}));
+    const auto firmware = disk->GetProperty("Firmware", none);
+    firmware->SetValue(TCIMValue("old"), none);
+    {
+        TInMemStaging staging(ns);
+        staging.KeepStaticValues(*disk);
+        Allocate(disk, {{"Id", "sdb"}, {"Firmware", "newer"}});
+        staging.KeepStaticValues(*disk);
+        firmware->MarkChanged(TCIMValue("newest"));
+    }
+    EXPECT_EQ("old", firmware->GetValue(none).ToText());
+    EXPECT_FALSE(dynamic_cast<const TInMemStaticProperty&>(*firmware).IsChanged());
+    {
+        TInMemStaging staging(ns);
+        staging.KeepStaticValues(*disk);
+        Allocate(disk, {{"Id", "sdb"}, {"Firmware", "new"}});
+        staging.Commit();
+    }
+    EXPECT_EQ("new", firmware->GetValue(none).ToText());
+}
+
 TEST_F(InMemStagingTest, RefusesWhatIsThereAndGoesOn)
 {
     TInMemStaging staging(ns);

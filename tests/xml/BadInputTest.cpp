@@ -2,6 +2,7 @@
 
 #include <string>
 
+#include "embedded/TCimXmlContext.h"
 #include "host/TZELException.h"
 #include "tests/xml/TLoading.h"
 
@@ -130,6 +131,28 @@ TEST(BadInputTest, AFailedLoadTakesBackWhatItAddedToClassesThatWereThere)
     loading.Load(L::Group(L::Class("A") + L::Instance("A", "old")));
     EXPECT_EQ(12, loading.StatusOf(L::Group(L::Instance("A", "new") + L::Instance("A", "old"))));
     EXPECT_EQ("root/cimv2:A.Id=\"old\"\n", loading.PathsOf("A"));
+}
+
+TEST(CimXmlContextTest, WhatTheNamespaceRefusesEndsTheLoadAtItsPlace)
+{
+    TCimXmlContext context("doc.xml");
+    const TCimXmlContext::TAt at(context, {3, 4});
+    const auto errorOf = [&context](const TZELException& error) {
+        try {
+            context.Guard([&] { throw error; });
+            return std::string();
+        } catch (const TPopulateError& told) {
+            return std::to_string(told.GetStatusCode().GetStatus()) + " " + told.what();
+        }
+    };
+    EXPECT_EQ("13 doc.xml:3:4: found what cannot be taken: Type mismatch", errorOf(TZELException(TZELStatusCode::kTypeMismatch)));
+    EXPECT_EQ(5, context.Guard([] { return 5; }));
+    try {
+        context.Guard([] { throw TPopulateError(TZELStatusCode::kParseError, "told", "other.xml", 1, 2); });
+        ADD_FAILURE() << "nothing was thrown";
+    } catch (const TPopulateError& told) {
+        EXPECT_STREQ("other.xml:1:2: told", told.what());
+    }
 }
 
 }  // namespace

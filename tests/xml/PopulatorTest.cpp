@@ -256,6 +256,17 @@ TEST_F(PopulatorTest, AnErrorOfTheSourcePassesAndNothingStays)
     EXPECT_TRUE(fLoading.GetNamespace()->GetClasses().empty());
 }
 
+TEST_F(PopulatorTest, AStaticValueIsAsItWasAfterAFailure)
+{
+    fLoading.Load(L::Group(L::Class("A", "<PROPERTY NAME=\"V\" TYPE=\"string\"><QUALIFIER NAME=\"Static\" TYPE=\"boolean\">"
+                                         "<VALUE>TRUE</VALUE></QUALIFIER></PROPERTY>") +
+                           L::Instance("A", "1", L::Property("V", "string", "old"))));
+    EXPECT_NE("", fLoading.ErrorOf(L::Group(L::Instance("A", "2", L::Property("V", "string", "new")) + "<oops/>")));
+    EXPECT_EQ("old", fLoading.ValueOf("A.Id=\"1\"", "V"));
+    fLoading.Load(L::Group(L::Instance("A", "2", L::Property("V", "string", "new"))));
+    EXPECT_EQ("new", fLoading.ValueOf("A.Id=\"1\"", "V"));
+}
+
 TEST_F(PopulatorTest, TheDeltaSchemaLoadsWithGeneratedKeys)
 {
     const auto elements =

@@ -1,0 +1,32 @@
+#pragma once
+
+#include <string>
+
+#include "tests/client/ClientTest.h"
+#include "tests/client/Documents.h"
+
+namespace NORVZEL20 {
+
+/// Compares two documents that stand in the test itself.
+class PairTest : public ClientTest {
+  protected:
+    /// The report of the comparison, or the complaint; the documents are called "a" and "b", without the paths of their files.
+    std::string Compare(const std::string& a, const std::string& b)
+    {
+        const std::string first = Scratch("a.xml", a);
+        const std::string second = Scratch("b.xml", b);
+        Run({"compare", first, second});
+        return Named(fStatus == 2 ? fErr : fOut, first, second);
+    }
+
+    static std::string Named(const std::string& text, const std::string& first, const std::string& second)
+    {
+        const std::string directory = first.substr(0, first.rfind('/') + 1);
+        const auto label = [&](const std::string& path) {
+            return path.substr(directory.size(), path.size() - directory.size() - 4);
+        };
+        return Shorten(Shorten(Shorten(text, directory, ""), label(first), "a"), label(second), "b");
+    }
+};
+
+}  // namespace NORVZEL20

@@ -1,0 +1,69 @@
+#include "tests/client/PairTest.h"
+
+namespace NORVZEL20 {
+namespace {
+
+/// Inventories whose declarations do not fit together: the complaint names them, and what to do.
+class SchemaConflictTest : public PairTest {};
+
+TEST_F(SchemaConflictTest, APropertyThatAClassBelowDeclaresOtherwise)
+{
+    const std::string above = Document(System() + Class("Disk", "", KeyProperty("Id") + Declaration("Size", "uint32")));
+    const std::string below =
+        Document(System() + Class("Disk", "", KeyProperty("Id")) + Class("FastDisk", "Disk", Declaration("Size", "string")));
+    EXPECT_EQ(
+        "cimdelta: b.xml: property Size of class Disk of a.xml cannot be declared here: class FastDisk below it has one of that "
+        "name with the type string instead of uint32; give them one type in both inventories, or another name\n",
+        Compare(above, below));
+    EXPECT_EQ("cimdelta: b.xml: class FastDisk of a.xml cannot be declared here: Type mismatch; a superclass has a property of "
+              "another type in the two inventories\n",
+              Compare(below, above));
+}
+
+TEST_F(SchemaConflictTest, AnOperatingSystemThatCannotBeDeclaredAsInTheOther)
+{
+    const auto standard = [](const std::string& type) {
+        return Class("CIM_OperatingSystem", "", KeyProperty("Name") + Declaration("Version", type));
+    };
+    const std::string with = Document(
+        standard("uint32") +
+        Class("KALMO_OperatingSystem", "CIM_OperatingSystem", Declaration("Version", "uint32") + Declaration("OSType", "uint16")) +
+        Instance("KALMO_OperatingSystem", Value("Name", "a") + Value("OSType", "36", "uint16")));
+    EXPECT_EQ(
+        "cimdelta: b.xml: has no instance of KALMO_OperatingSystem, which a comparison needs, and none can be made: the class "
+        "cannot be declared as in a.xml, property Version of KALMO_OperatingSystem is uint32 there, but CIM_OperatingSystem "
+        "declares it as string here; add one to the inventory\n",
+        Compare(with, Document(standard("string"))));
+}
+
+TEST_F(SchemaConflictTest, AnOperatingSystemThatNoInstanceCanBeMadeOf)
+{
+    const std::string array = Class("KALMO_OperatingSystem", "",
+                                    "<PROPERTY.ARRAY NAME=\"Names\" TYPE=\"string\">" + std::string(kKey) + "</PROPERTY.ARRAY>");
+    EXPECT_EQ("cimdelta: a.xml: has no instance of KALMO_OperatingSystem, which a comparison needs, and none can be made: its key "
+              "Names is an array; add one to the inventory\n",
+              Compare(Document(array), Document(System())));
+    const std::string below = Class("KALMO_OperatingSystem", "", KeyProperty("Name")) +
+                              Class("Server", "KALMO_OperatingSystem", Declaration("OSType", "string"));
+    EXPECT_EQ("cimdelta: a.xml: has no instance of KALMO_OperatingSystem, which a comparison needs, and none can be made: property "
+              "OSType of Server is string instead of uint16; add one to the inventory\n",
+              Compare(Document(below), Document(System())));
+}
+
+TEST_F(SchemaConflictTest, ValuesOfDifferentTypesAreEqualWhereThereAreNone)
+{
+    const auto disk = [](const std::string& type, const std::string& value) {
+        return Document(System() + Class("Disk", "", KeyProperty("Id") + Declaration("Size", type)) +
+                        Instance("Disk", Value("Id", "1") + value));
+    };
+    const std::string coverage = "\n"
+                                 "Compared: 2 classes; 2 instances of a, 2 instances of b.\n"
+                                 "Of another type in b than in a, so equal only where both are NULL: Disk.Size.\n";
+    EXPECT_EQ("No differences between a and b.\n" + coverage, Compare(disk("uint32", ""), disk("uint64", "")));
+    EXPECT_EQ("1 difference between a and b: 1 changed value in 1 instance\n\nDisk\n~ Id=\"1\"\n    Size: uint32 1 -> uint64 1\n" +
+                  coverage,
+              Compare(disk("uint32", Value("Size", "1", "uint32")), disk("uint64", Value("Size", "1", "uint64"))));
+}
+
+}  // namespace
+}  // namespace NORVZEL20

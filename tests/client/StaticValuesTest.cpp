@@ -1,0 +1,69 @@
+#include "tests/client/PairTest.h"
+
+namespace NORVZEL20 {
+namespace {
+
+/// Three disks whose firmware is one value of their class.
+std::string Disks(const std::string& firmware)
+{
+    std::string disks;
+    for (const char* const id : {"0", "1", "2"}) {
+        disks += Instance("Disk", Value("Id", id) + Value("Firmware", firmware));
+    }
+    return Document(System() + Class("Disk", "", KeyProperty("Id") + Declaration("Firmware", "string", Qualifier("Static"))) +
+                    disks);
+}
+
+const char kDisks[] = "Disk\n"
+                      "~ Id=\"0\"\n"
+                      "    Firmware: old -> new\n"
+                      "~ Id=\"1\"\n"
+                      "    Firmware: old -> new\n"
+                      "~ Id=\"2\"\n"
+                      "    Firmware: old -> new\n"
+                      "\n";
+
+class StaticValuesTest : public PairTest {};
+
+TEST_F(StaticValuesTest, EveryInstanceOfAPairShowsTheValueBefore)
+{
+    EXPECT_EQ(std::string("3 differences between a and b: 3 changed values in 3 instances\n\n") + kDisks +
+                  "Compared: 2 classes; 4 instances of a, 4 instances of b.\n",
+              Compare(Disks("old"), Disks("new")));
+    EXPECT_EQ("No differences between a and b.\n\nCompared: 2 classes; 4 instances of a, 4 instances of b.\n",
+              Compare(Disks("old"), Disks("old")));
+}
+
+TEST_F(StaticValuesTest, APropertyMayBeStaticInOneInventoryAlone)
+{
+    const std::string ordinary =
+        Document(System() + Class("Disk", "", KeyProperty("Id") + Declaration("Firmware", "string")) +
+                 Instance("Disk", Value("Id", "0") + Value("Firmware", "x")) +
+                 Instance("Disk", Value("Id", "1") + Value("Firmware", "y")) + Instance("Disk", Value("Id", "2")));
+    EXPECT_EQ("3 differences between a and b: 3 changed values in 3 instances\n"
+              "\n"
+              "Disk\n"
+              "~ Id=\"0\"\n"
+              "    Firmware: old -> x\n"
+              "~ Id=\"1\"\n"
+              "    Firmware: old -> y\n"
+              "~ Id=\"2\"\n"
+              "    Firmware: old -> NULL\n"
+              "\n"
+              "Compared: 2 classes; 4 instances of a, 4 instances of b.\n",
+              Compare(Disks("old"), ordinary));
+    EXPECT_NE(std::string::npos, Compare(ordinary, Disks("old")).find("    Firmware: y -> old\n"));
+}
+
+TEST_F(StaticValuesTest, SoDoesEveryInstanceOfThree)
+{
+    const std::string old = Scratch("a.xml", Disks("old"));
+    const std::string other = Scratch("b.xml", Disks("new"));
+    const std::string third = Scratch("c.xml", Disks("new"));
+    const std::string report = Named(Result({"compare", old, other, third}), old, other);
+    EXPECT_EQ(0u, report.find("3 differences between a and b, ")) << report;
+    EXPECT_NE(std::string::npos, report.find("    Firmware: old -> b, ")) << report;
+}
+
+}  // namespace
+}  // namespace NORVZEL20
