@@ -19,10 +19,11 @@ class TSchemaCompletion {
     explicit TSchemaCompletion(std::vector<TInventory>& inventories) : fInventories(inventories) {}
 
     /// What was done and found, in that order. Errors: TClientError where a class cannot be declared in an inventory because a
-    /// superclass there has a property of another type.
+    /// superclass there has a property of another type, or because it would go beyond TSchemaLimits.
     std::vector<TSchemaNote> Run();
 
   private:
+    void SpreadWithinLimits(std::size_t source, const TInMemClass& cls, std::size_t target);
     void Spread(std::size_t source, const TInMemClass& cls, std::size_t target);
     void Declare(std::size_t source, const TInMemClass& cls, std::size_t target);
     void Respell(std::size_t source, const TInMemClass& cls, std::size_t target);

@@ -3,6 +3,7 @@
 #include <boost/smart_ptr/make_shared.hpp>
 
 #include "embedded/TInMemQualifier.h"
+#include "embedded/TSchemaLimits.h"
 #include "embedded/TValueText.h"
 
 namespace NORVZEL20 {
@@ -11,19 +12,9 @@ namespace {
 
 using EStatus = TZELStatusCode::EStatusCode;
 
-constexpr std::size_t kMaxSuperClasses = 1000;  // whoever walks a class tree does so recursively
-
 std::string DescribeType(TCIMValue::TCIMType type)
 {
     return std::string(TValueText::GetTypeName(type)) + (type.IsArray() ? "[]" : "");
-}
-
-bool HasTooManySuperClasses(const TInMemClass* super)
-{
-    std::size_t count = 0;
-    for (; super != nullptr && count <= kMaxSuperClasses; super = super->GetSuperInMemClass().get())
-        ++count;
-    return count > kMaxSuperClasses;
 }
 
 }  // namespace
@@ -31,9 +22,10 @@ bool HasTooManySuperClasses(const TInMemClass* super)
 boost::shared_ptr<TInMemClass> TCimXmlClassMaker::Make(const TCimXmlDraft& draft, const boost::shared_ptr<TInMemClass>& super)
 {
     const TEmbeddedObject& object = draft.object;
-    if (HasTooManySuperClasses(super.get()))
+    if (super && super->CountSuperClasses() >= TSchemaLimits::kMaxSuperClasses)
         fContext.Fail(EStatus::kParseError, "found class " + TCimXmlContext::Quote(object.GetClassName()) + " below more than " +
-                                                std::to_string(kMaxSuperClasses) + " superclasses; flatten the class tree");
+                                                std::to_string(TSchemaLimits::kMaxSuperClasses) +
+                                                " superclasses; flatten the class tree");
     const boost::shared_ptr<TInMemClass> cls = fNamespace.AllocateInMemClass(object.GetClassName(), super);
     AddQualifiers(*cls, object.GetQualifiers(), super ? &super->GetQualifiers() : nullptr);
     for (std::size_t index = 0; index < object.GetProperties().size(); ++index) {

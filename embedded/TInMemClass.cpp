@@ -164,6 +164,15 @@ boost::shared_ptr<ICIMClass> TInMemClass::GetSuperClass(TCallContext) const
     return fSuper;
 }
 
+std::size_t TInMemClass::CountSuperClasses() const noexcept
+{
+    std::size_t count = 0;
+    for (const TInMemClass* cls = fSuper.get(); cls; cls = cls->fSuper.get()) {
+        ++count;
+    }
+    return count;
+}
+
 std::vector<boost::shared_ptr<TInMemClass>> TInMemClass::GetSubClasses() const
 {
     std::vector<boost::shared_ptr<TInMemClass>> classes;

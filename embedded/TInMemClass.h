@@ -102,6 +102,8 @@ class TInMemClass final : public TInMemNamedElement<ICIMClass>, public boost::en
     bool IsSubclassOf(std::string_view name) const noexcept;
     /// Null for a top-level class.
     const boost::shared_ptr<TInMemClass>& GetSuperInMemClass() const noexcept { return fSuper; }
+    /// How many classes are above this one. Cost: in proportion to them.
+    std::size_t CountSuperClasses() const noexcept;
     /// The direct subclasses in order of declaration.
     std::vector<boost::shared_ptr<TInMemClass>> GetSubClasses() const;
     /// All classes below this one, each before its own subclasses.
