@@ -31,10 +31,24 @@ boost::shared_ptr<TInMemClass> TCimXmlClassMaker::Make(const TCimXmlDraft& draft
     for (std::size_t index = 0; index < object.GetProperties().size(); ++index) {
         const TCimXmlContext::TAt at(fContext, draft.propertyPlaces[index]);
         AddProperty(*cls, object.GetProperties()[index], super.get());
+        if (cls->GetSlotOrder().size() > TSchemaLimits::kMaxProperties)
+            FailTooMany(TSchemaLimits::kMaxProperties, "properties", object.GetClassName());
     }
-    for (const TEmbeddedObject::TMethod& method : object.GetMethods())
+    std::size_t methods = 0;
+    for (const TInMemClass* above = super.get(); above != nullptr; above = above->GetSuperInMemClass().get())
+        methods += above->GetOwnMethodDecls().size();
+    for (const TEmbeddedObject::TMethod& method : object.GetMethods()) {
         AddMethod(*cls, method, super.get());
+        if (methods + cls->GetOwnMethodDecls().size() > TSchemaLimits::kMaxMethods)
+            FailTooMany(TSchemaLimits::kMaxMethods, "methods", object.GetClassName());
+    }
     return cls;
+}
+
+void TCimXmlClassMaker::FailTooMany(std::size_t most, const char* what, const std::string& className) const
+{
+    fContext.Fail(EStatus::kParseError, "found more than " + std::to_string(most) + " " + what + " in class " +
+                                            TCimXmlContext::Quote(className) + ", inherited ones included; split it");
 }
 
 void TCimXmlClassMaker::AddProperty(TInMemClass& cls, const TEmbeddedObject::TProperty& property, const TInMemClass* super)
@@ -80,6 +94,9 @@ void TCimXmlClassMaker::AddMethod(TInMemClass& cls, const TEmbeddedObject::TMeth
 template <class TElement>
 void TCimXmlClassMaker::AddQualifiers(TElement& element, const TQualifiers& qualifiers, const TInMemQualifierSet* inherited)
 {
+    if (qualifiers.size() + (inherited != nullptr ? inherited->CountAll() : 0) > TSchemaLimits::kMaxQualifiers)
+        fContext.Fail(EStatus::kParseError, "found more than " + std::to_string(TSchemaLimits::kMaxQualifiers) +
+                                                " qualifiers on one element, inherited ones included; leave some out");
     for (const TEmbeddedObject::TQualifier& qualifier : qualifiers) {
         boost::shared_ptr<ICIMQualifier> above;
         if (inherited != nullptr)

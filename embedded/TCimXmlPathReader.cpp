@@ -1,6 +1,7 @@
 #include "embedded/TCimXmlPathReader.h"
 
 #include "embedded/TNameText.h"
+#include "embedded/TSchemaLimits.h"
 #include "embedded/TValueText.h"
 
 namespace NORVZEL20 {
@@ -149,6 +150,9 @@ void TCimXmlPathReader::EndKeyValue(std::string_view text)
 void TCimXmlPathReader::AddKey(TCIMValue value)
 {
     TFrame& frame = fFrames[fDepth - 1];
+    if (frame.keys.size() == TSchemaLimits::kMaxKeyBindings)
+        fContext.Fail(EStatus::kParseError,
+                      "found more than " + std::to_string(TSchemaLimits::kMaxKeyBindings) + " key bindings in one path");
     frame.keys.emplace_back(frame.keyName, std::move(value));
     frame.keyName.clear();
 }
