@@ -326,12 +326,19 @@ bool TInMemClass::RemoveInstance(boost::shared_ptr<ICIMInstance> instance)
     return own && own->GetInMemClass().get() == this && GetExtent().Remove(*own);
 }
 
-bool TInMemClass::HasInstances() const
+/// Instances are told apart by their keys: none may go while there are any, here or below, that have it because of `decl` alone.
+void TInMemClass::CheckKeyStays(const TInMemPropertyDecl& decl) const
 {
-    const auto below = GetClassesBelow();
-    return GetInstanceCount() > 0 || std::any_of(below.begin(), below.end(), [](const boost::shared_ptr<TInMemClass>& cls) {
-               return cls->GetInstanceCount() > 0;
-           });
+    const auto check = [&decl](const TInMemClass& cls) {
+        const auto there = cls.FindPropertyDecl(decl.GetName());
+        if (cls.GetInstanceCount() > 0 && there && there->IsKey() && !there->IsKeyWithout(decl)) {
+            throw TZELException(TZELStatusCode::kClassInUse);
+        }
+    };
+    check(*this);
+    for (const auto& cls : GetClassesBelow()) {
+        check(*cls);
+    }
 }
 
 void TInMemClass::SetSpelling(const std::string& name)

@@ -90,7 +90,7 @@ class TInMemClass final : public TInMemNamedElement<ICIMClass>, public boost::en
     /// `decl` must come from AllocatePropertyDecl and be in no class yet, else status 5. One that an ancestor declares is
     /// overridden by it: status 13 where the types differ. Subclasses get the property too. A key comes last among the keys.
     bool AddPropertyDecl(boost::shared_ptr<ICIMPropertyDecl> decl) override;
-    /// False for an inherited one. Errors: status 19 for a key of a class with instances.
+    /// False for an inherited one. Errors: status 19 where this class, or one below, has instances and would lose a key.
     bool RemovePropertyDecl(boost::shared_ptr<ICIMPropertyDecl> decl) override;
     bool AddMethodDecl(boost::shared_ptr<ICIMMethodDecl> decl) override;
     bool RemoveMethodDecl(boost::shared_ptr<ICIMMethodDecl> decl) override;
@@ -151,7 +151,7 @@ class TInMemClass final : public TInMemNamedElement<ICIMClass>, public boost::en
     boost::shared_ptr<TInMemNamespace> RequireNamespace() const;
     TInMemExtent& GetExtent() const;
     TCIMReference MakePath() const;
-    bool HasInstances() const;
+    void CheckKeyStays(const TInMemPropertyDecl& decl) const;
     bool IsPseudoClass() const noexcept;
 
     boost::shared_ptr<TInMemPropertyDecl> FindOwnDecl(std::string_view name) const;

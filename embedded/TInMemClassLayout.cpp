@@ -250,15 +250,20 @@ bool TInMemClass::AddPropertyDecl(boost::shared_ptr<ICIMPropertyDecl> decl)
     const auto below = PrepareChange();
     fOwn.push_back(own);
     own->fOwner = weak_from_this();
-    if (there || !fSubClasses.empty()) {
+    if (!fSubClasses.empty()) {
         DeclChanged(*own, below);
         return true;
     }
     // The common case while a class is built, without going over all that it has already.
-    AppendSlot(own);
-    fOrder.push_back(GetSlotCount() - 1);
+    if (there) {
+        own->Override(there);
+        fSlots[FindSlot(own->GetName())] = own;
+    } else {
+        AppendSlot(own);
+        fOrder.push_back(GetSlotCount() - 1);
+    }
     ++fLayout;
-    if (own->IsKey()) {
+    if (own->IsKey() != (there && there->IsKey())) {
         UpdateKeys();
     }
     return true;
@@ -271,9 +276,7 @@ bool TInMemClass::RemovePropertyDecl(boost::shared_ptr<ICIMPropertyDecl> decl)
         return false;
     }
     const auto own = *at;
-    if (own->IsKey() && !own->GetOverridden() && HasInstances()) {
-        throw TZELException(TZELStatusCode::kClassInUse);
-    }
+    CheckKeyStays(*own);
     const auto below = GetClassesBelow();
     fOwn.erase(at);
     own->fOwner.reset();

@@ -89,6 +89,46 @@ TEST_F(InMemClassChangeTest, AKeyOfAClassWithInstancesStays)
     EXPECT_EQ("Id", KeysOf(*fan));
 }
 
+/// Two instances would have one path.
+TEST_F(InMemClassChangeTest, AKeyThatAnOverrideMadeStaysWhileThereAreInstances)
+{
+    const auto label = Decl({"Label", TType::kString, {}});
+    const auto own = Decl({"Label", TType::kString, {"Key"}});
+    device->AddPropertyDecl(label);
+    disk->AddPropertyDecl(own);
+    Add(solidState, {{"Id", "sda"}, {"Label", "one"}});
+    Add(solidState, {{"Id", "sda"}, {"Label", "two"}});
+    EXPECT_EQ(19, StatusOf([&] { disk->RemovePropertyDecl(own); }));
+    EXPECT_EQ("Id Label", KeysOf(*solidState));
+    ns->ClearInstances();
+    Add(fan, {{"Id", "fan0"}, {"Label", "none of its keys"}});
+    EXPECT_TRUE(disk->RemovePropertyDecl(own));
+    EXPECT_EQ("Id", KeysOf(*solidState));
+}
+
+TEST_F(InMemClassChangeTest, AnOverrideThatRepeatsTheKeyMayGo)
+{
+    const auto own = Decl({"Id", TType::kString, {"Key"}});
+    disk->AddPropertyDecl(own);
+    Add(disk, {{"Id", "sda"}});
+    EXPECT_EQ(0, StatusOf([&] { own->AddQualifier(Qualifier("Key", TCIMValue(false)), none); }));
+    EXPECT_TRUE(disk->RemovePropertyDecl(own));
+    EXPECT_EQ("Id", KeysOf(*disk));
+}
+
+TEST_F(InMemClassChangeTest, AKeyIsNotUnsaidWhileThereAreInstances)
+{
+    const auto id = device->GetPropertyDecl("Id", none);
+    Add(fan, {{"Id", "fan0"}});
+    EXPECT_EQ(19, StatusOf([&] { id->AddQualifier(Qualifier("KEY", TCIMValue(false)), none); }));
+    EXPECT_EQ("Id", KeysOf(*fan));
+    EXPECT_EQ("Key", QualifiersOf(*id));
+    EXPECT_EQ(0, StatusOf([&] { id->AddQualifier(Qualifier("Key"), none); }));
+    ns->ClearInstances();
+    EXPECT_EQ(0, StatusOf([&] { id->AddQualifier(Qualifier("Key", TCIMValue(false)), none); }));
+    EXPECT_EQ("", KeysOf(*fan));
+}
+
 TEST_F(InMemClassChangeTest, AKeyThatComesLateLeavesInstancesToBeFound)
 {
     const auto instance = Add(room, {{"Name", "hall"}});
