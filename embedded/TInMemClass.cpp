@@ -223,6 +223,16 @@ bool TInMemClass::IsSubclassOf(boost::shared_ptr<const ICIMClass> cls, TCallCont
     return IsSubclassOf(cls->GetName(context));
 }
 
+void TInMemClass::EnumerateKeyNames(const boost::function<bool(const std::string*)>& callback, TCallContext) const
+{
+    const std::vector<std::uint32_t> slots = fKeySlots;
+    for (const std::uint32_t slot : slots) {
+        if (!callback(&fSlots[slot]->GetName())) {
+            return;
+        }
+    }
+}
+
 boost::shared_ptr<TInMemInstance> TInMemClass::AllocateInMemInstance()
 {
     return TInMemInstance::Create(shared_from_this());

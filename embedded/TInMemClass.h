@@ -159,6 +159,7 @@ class TInMemClass final : public TInMemNamedElement<ICIMClass>, public boost::en
     void InheritSlots();
     void InheritDecl(std::string_view name);
     void AppendSlot(const boost::shared_ptr<TInMemPropertyDecl>& decl);
+    void TakeIn(const boost::shared_ptr<TInMemPropertyDecl>& decl, std::size_t position);
     void CheckOverrides(const TInMemPropertyDecl& decl) const;
     void ReserveSlot();
     std::vector<boost::shared_ptr<TInMemClass>> PrepareChange();

@@ -1,4 +1,4 @@
-// Class trees that are taller than any schema's.
+// Class trees that are taller, and classes that are wider, than any schema's.
 #include "client/CimWalk.h"
 #include "client/TRuleTrace.h"
 #include "embedded/TInMemNamespace.h"
@@ -25,6 +25,16 @@ std::string Chain(std::size_t first, std::size_t last)
     return text + "</DECLGROUP></DECLARATION></CIM>";
 }
 
+/// An inventory of one class with so many properties, numbered from `first` on.
+std::string Wide(std::size_t first, std::size_t count)
+{
+    std::string text = "<CIM CIMVERSION=\"2.0\" DTDVERSION=\"2.0\"><DECLARATION><DECLGROUP><VALUE.OBJECT><CLASS NAME=\"A\">";
+    for (std::size_t number = first; number < first + count; ++number) {
+        text += "<PROPERTY NAME=\"P" + std::to_string(number) + "\" TYPE=\"uint8\"/>";
+    }
+    return text + "</CLASS></VALUE.OBJECT></DECLGROUP></DECLARATION></CIM>";
+}
+
 boost::shared_ptr<TInMemNamespace> TallNamespace(std::size_t height)
 {
     const boost::shared_ptr<TInMemNamespace> ns = TInMemNamespace::Create("root/cimv2");
@@ -48,6 +58,16 @@ TEST_F(TallTreeTest, InventoriesWhoseTreesJoinBeyondTheLimitAreRefused)
         "cimdelta: lower.xml: class C1001 of upper.xml cannot be declared here: it would be below more than 1000 superclasses; "
         "flatten the class tree\n",
         Shorten(Shorten(complaint.substr(complaint.rfind("cimdelta: ")), lower, "lower.xml"), upper, "upper.xml"));
+}
+
+TEST_F(TallTreeTest, InventoriesWhosePropertiesJoinBeyondTheLimitAreRefused)
+{
+    const std::string first = Scratch("first.xml", Wide(0, 600));
+    const std::string second = Scratch("second.xml", Wide(600, 600));
+    const std::string complaint = Complaint({"compare", first, second});
+    EXPECT_EQ("cimdelta: second.xml: class A of first.xml cannot be declared here: class A would have more than 1024 properties; "
+              "split it\n",
+              Shorten(Shorten(complaint.substr(complaint.rfind("cimdelta: ")), first, "first.xml"), second, "second.xml"));
 }
 
 TEST_F(TallTreeTest, TreesThatJoinWithinTheLimitAreCompared)

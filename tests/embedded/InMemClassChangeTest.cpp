@@ -13,6 +13,23 @@ TEST_F(InMemClassChangeTest, APropertyThatComesLateReachesAllBelow)
     EXPECT_EQ("Id Serial", PropertiesOf(*device));
 }
 
+TEST_F(InMemClassChangeTest, PropertiesThatComeLateComeInTheOrderOfThoseThatComeEarly)
+{
+    const auto tape = Declare("Tape", fan, {{"Serial", TType::kString, {}}, {"Length", TType::kUint32, {}}});
+    const auto reel = Declare("Reel", tape, {{"Width", TType::kUint8, {}}});
+    disk->AddPropertyDecl(Decl({"Blocks", TType::kUint64, {}}));
+    device->AddPropertyDecl(Decl({"Serial", TType::kString, {}}));
+    device->AddPropertyDecl(Decl({"Weight", TType::kUint32, {"Key"}}));
+    fan->AddPropertyDecl(Decl({"Blades", TType::kUint8, {}}));
+    EXPECT_EQ("Id Serial Weight Speed Blades Length Width", PropertiesOf(*reel));
+    EXPECT_EQ("Id Serial Weight Size Blocks Wear", PropertiesOf(*solidState));
+    EXPECT_EQ("Id Weight", KeysOf(*reel));
+    EXPECT_EQ("Id Weight", KeysOf(*solidState));
+    EXPECT_EQ(tape, boost::dynamic_pointer_cast<TInMemPropertyDecl>(reel->GetPropertyDecl("Serial", none))->GetOwner());
+    EXPECT_EQ("Id=r1 Serial=NULL Weight=NULL Speed=NULL Blades=NULL Length=NULL Width=7",
+              ValuesOf(*Allocate(reel, {{"Id", "r1"}, {"Width", TCIMValue(std::uint8_t(7))}})));
+}
+
 TEST_F(InMemClassChangeTest, ASubclassThatIsDeclaredLateHasWhatItsSuperclassGotMeanwhile)
 {
     const auto tape = Allocate("Tape", device, {{"Length", TType::kUint32, {}}});
