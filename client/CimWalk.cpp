@@ -1,5 +1,7 @@
 #include "client/CimWalk.h"
 
+#include <algorithm>
+
 #include "host/TAddToVectorCallback.h"
 #include "host/TZELException.h"
 
@@ -18,14 +20,6 @@ auto FindOrNull(TLookUp lookUp) -> decltype(lookUp())
             throw;
         }
         return {};
-    }
-}
-
-void AppendWithSubclasses(std::vector<boost::shared_ptr<ICIMClass>>& classes, ICIMClass& parent)
-{
-    for (const boost::shared_ptr<ICIMClass>& cls : SubclassesOf(parent)) {
-        classes.push_back(cls);
-        AppendWithSubclasses(classes, *cls);
     }
 }
 
@@ -74,7 +68,14 @@ std::vector<std::string> KeyNamesOf(const ICIMClass& cls)
 std::vector<boost::shared_ptr<ICIMClass>> AllClassesOf(ICIMNamespace& ns)
 {
     std::vector<boost::shared_ptr<ICIMClass>> classes;
-    AppendWithSubclasses(classes, *ns.GetClass("<root>", TCallContext()));
+    std::vector<boost::shared_ptr<ICIMClass>> open = SubclassesOf(*ns.GetClass("<root>", TCallContext()));
+    std::reverse(open.begin(), open.end());
+    while (!open.empty()) {
+        classes.push_back(open.back());
+        open.pop_back();
+        const std::vector<boost::shared_ptr<ICIMClass>> subclasses = SubclassesOf(*classes.back());
+        open.insert(open.end(), subclasses.rbegin(), subclasses.rend());
+    }
     return classes;
 }
 

@@ -27,6 +27,12 @@ TRuleTrace::TClass MakeEntry(const TRulesDocument::TElement& element)
     return entry;
 }
 
+// A class that rules flow down to, and whose they are.
+struct TClassBelow {
+    boost::shared_ptr<ICIMClass> cls;
+    std::string parent;
+};
+
 // The plug-in's merge: the other's default and listed properties prevail, excluded keys stay as they are.
 void Merge(TRuleTrace::TClass& entry, const TRuleTrace::TClass& other)
 {
@@ -105,11 +111,20 @@ void TRuleTrace::MergeOwn(TClass& entry, const TRulesDocument::TElement& element
 
 void TRuleTrace::PushDown(const std::string& className, const TRulesDocument::TElement& origin)
 {
-    const boost::shared_ptr<ICIMClass> cls = fSchema->GetClass(className, TCallContext());
-    for (const boost::shared_ptr<ICIMClass>& sub : SubclassesOf(*cls)) {
-        const std::string name = sub->GetName(TCallContext());
-        Inherit(name, fClasses.at(className), origin);
-        PushDown(name, origin);
+    std::vector<TClassBelow> open;
+    const auto addSubclasses = [&open](ICIMClass& cls, const std::string& name) {
+        const std::vector<boost::shared_ptr<ICIMClass>> subclasses = SubclassesOf(cls);
+        for (auto sub = subclasses.rbegin(); sub != subclasses.rend(); ++sub) {
+            open.push_back({*sub, name});
+        }
+    };
+    addSubclasses(*fSchema->GetClass(className, TCallContext()), className);
+    while (!open.empty()) {
+        const TClassBelow below = open.back();
+        open.pop_back();
+        const std::string name = below.cls->GetName(TCallContext());
+        Inherit(name, fClasses.at(below.parent), origin);
+        addSubclasses(*below.cls, name);
     }
 }
 

@@ -34,8 +34,8 @@ std::vector<std::string> PropertyNames(const TInMemClass& cls)
 std::size_t CountWithSubclasses(const TInMemClass& cls)
 {
     std::size_t count = cls.GetInstanceCount();
-    for (const boost::shared_ptr<TInMemClass>& sub : cls.GetSubClasses()) {
-        count += CountWithSubclasses(*sub);
+    for (const boost::shared_ptr<TInMemClass>& below : cls.GetClassesBelow()) {
+        count += below->GetInstanceCount();
     }
     return count;
 }

@@ -9,6 +9,7 @@
 #include "embedded/TNameText.h"
 #include "embedded/TReferenceAdapter.h"
 #include "embedded/TSchemaCopier.h"
+#include "embedded/TSchemaLimitError.h"
 #include "host/TZELException.h"
 
 namespace NORVZEL20 {
@@ -49,7 +50,7 @@ std::vector<TSchemaNote> TSchemaCompletion::Run()
         for (const boost::shared_ptr<TInMemClass>& cls : classes) {
             for (std::size_t target = 0; target < fInventories.size(); ++target) {
                 if (target != source) {
-                    Spread(source, *cls, target);
+                    SpreadWithinLimits(source, *cls, target);
                 }
             }
         }
@@ -57,6 +58,16 @@ std::vector<TSchemaNote> TSchemaCompletion::Run()
     AdaptReferences();
     SortNotes();
     return fNotes;
+}
+
+void TSchemaCompletion::SpreadWithinLimits(std::size_t source, const TInMemClass& cls, std::size_t target)
+{
+    try {
+        Spread(source, cls, target);
+    } catch (const TSchemaLimitError& error) {
+        throw TClientError(fInventories[target].path + ": class " + cls.GetName() + " of " + fInventories[source].path +
+                           " cannot be declared here: " + error.what());
+    }
 }
 
 void TSchemaCompletion::Spread(std::size_t source, const TInMemClass& cls, std::size_t target)
@@ -89,6 +100,8 @@ void TSchemaCompletion::Declare(std::size_t source, const TInMemClass& cls, std:
         for (const boost::shared_ptr<TInMemClass>& declared : TSchemaCopier(fInventories[target].ns).CopyClass(cls)) {
             Note(TSchemaNote::kClassDeclared, target, source, declared->GetName(), std::string());
         }
+    } catch (const TSchemaLimitError&) {
+        throw;
     } catch (const TZELException& error) {
         throw TClientError(fInventories[target].path + ": class " + cls.GetName() + " of " + fInventories[source].path +
                            " cannot be declared here: " + error.what() +

@@ -20,10 +20,12 @@ class TSchemaCompletion {
 
     /// What was done and found, by the inventory whose declarations were taken, then by class; the order in the files does not
     /// show. Errors: TClientError where a class or property cannot be declared in an inventory because one above or below it there
-    /// has a property of another type, or where two instances are the same once their keys are spelled alike.
+    /// has a property of another type, or because it would go beyond TSchemaLimits, or where two instances are the same once their
+    /// keys are spelled alike.
     std::vector<TSchemaNote> Run();
 
   private:
+    void SpreadWithinLimits(std::size_t source, const TInMemClass& cls, std::size_t target);
     void Spread(std::size_t source, const TInMemClass& cls, std::size_t target);
     void Declare(std::size_t source, const TInMemClass& cls, std::size_t target);
     void DeclareProperty(std::size_t source, const TInMemPropertyDecl& property, std::size_t target, TInMemClass& there);

@@ -3,6 +3,7 @@
 #include <boost/smart_ptr/make_shared.hpp>
 
 #include "embedded/TInMemQualifier.h"
+#include "embedded/TSchemaLimits.h"
 #include "embedded/TValueText.h"
 
 namespace NORVZEL20 {
@@ -11,19 +12,9 @@ namespace {
 
 using EStatus = TZELStatusCode::EStatusCode;
 
-constexpr std::size_t kMaxSuperClasses = 1000;  // whoever walks a class tree does so recursively
-
 std::string DescribeType(TCIMValue::TCIMType type)
 {
     return std::string(TValueText::GetTypeName(type)) + (type.IsArray() ? "[]" : "");
-}
-
-bool HasTooManySuperClasses(const TInMemClass* super)
-{
-    std::size_t count = 0;
-    for (; super != nullptr && count <= kMaxSuperClasses; super = super->GetSuperInMemClass().get())
-        ++count;
-    return count > kMaxSuperClasses;
 }
 
 }  // namespace
@@ -31,19 +22,34 @@ bool HasTooManySuperClasses(const TInMemClass* super)
 boost::shared_ptr<TInMemClass> TCimXmlClassMaker::Make(const TCimXmlDraft& draft, const boost::shared_ptr<TInMemClass>& super)
 {
     const TEmbeddedObject& object = draft.object;
-    if (HasTooManySuperClasses(super.get()))
+    if (super && super->CountSuperClasses() >= TSchemaLimits::kMaxSuperClasses)
         fContext.Fail(EStatus::kParseError, "found class " + TCimXmlContext::Quote(object.GetClassName()) + " below more than " +
-                                                std::to_string(kMaxSuperClasses) + " superclasses; flatten the class tree");
+                                                std::to_string(TSchemaLimits::kMaxSuperClasses) +
+                                                " superclasses; flatten the class tree");
     fContext.CheckName("class", object.GetClassName());
     const boost::shared_ptr<TInMemClass> cls = fNamespace.AllocateInMemClass(object.GetClassName(), super);
     AddQualifiers(*cls, object.GetQualifiers(), super ? &super->GetQualifiers() : nullptr);
     for (std::size_t index = 0; index < object.GetProperties().size(); ++index) {
         const TCimXmlContext::TAt at(fContext, draft.propertyPlaces[index]);
         AddProperty(*cls, object.GetProperties()[index], super.get());
+        if (cls->GetSlotOrder().size() > TSchemaLimits::kMaxProperties)
+            FailTooMany(TSchemaLimits::kMaxProperties, "properties", object.GetClassName());
     }
-    for (const TEmbeddedObject::TMethod& method : object.GetMethods())
+    std::size_t methods = 0;
+    for (const TInMemClass* above = super.get(); above != nullptr; above = above->GetSuperInMemClass().get())
+        methods += above->GetOwnMethodDecls().size();
+    for (const TEmbeddedObject::TMethod& method : object.GetMethods()) {
         AddMethod(*cls, method, super.get());
+        if (methods + cls->GetOwnMethodDecls().size() > TSchemaLimits::kMaxMethods)
+            FailTooMany(TSchemaLimits::kMaxMethods, "methods", object.GetClassName());
+    }
     return cls;
+}
+
+void TCimXmlClassMaker::FailTooMany(std::size_t most, const char* what, const std::string& className) const
+{
+    fContext.Fail(EStatus::kParseError, "found more than " + std::to_string(most) + " " + what + " in class " +
+                                            TCimXmlContext::Quote(className) + ", inherited ones included; split it");
 }
 
 void TCimXmlClassMaker::AddProperty(TInMemClass& cls, const TEmbeddedObject::TProperty& property, const TInMemClass* super)
@@ -90,6 +96,9 @@ void TCimXmlClassMaker::AddMethod(TInMemClass& cls, const TEmbeddedObject::TMeth
 template <class TElement>
 void TCimXmlClassMaker::AddQualifiers(TElement& element, const TQualifiers& qualifiers, const TInMemQualifierSet* inherited)
 {
+    if (qualifiers.size() + (inherited != nullptr ? inherited->CountAll() : 0) > TSchemaLimits::kMaxQualifiers)
+        fContext.Fail(EStatus::kParseError, "found more than " + std::to_string(TSchemaLimits::kMaxQualifiers) +
+                                                " qualifiers on one element, inherited ones included; leave some out");
     for (const TEmbeddedObject::TQualifier& qualifier : qualifiers) {
         boost::shared_ptr<ICIMQualifier> above;
         if (inherited != nullptr)

@@ -13,7 +13,7 @@ namespace NORVZEL20 {
 ///
 /// Elements that a document repeats from a superclass (PROPAGATED) are left to be inherited where the superclass has them.
 /// Qualifiers without a declaration, and restated ones with another flavor, are put up with. Errors: every operation fails through
-/// the context.
+/// the context, also where a class would go beyond TSchemaLimits.
 class TCimXmlClassMaker {
   public:
     TCimXmlClassMaker(TCimXmlContext& context, TInMemNamespace& ns) : fContext(context), fNamespace(ns) {}
@@ -26,6 +26,7 @@ class TCimXmlClassMaker {
 
     template <class TElement>
     void AddQualifiers(TElement& element, const TQualifiers& qualifiers, const TInMemQualifierSet* inherited);
+    [[noreturn]] void FailTooMany(std::size_t most, const char* what, const std::string& className) const;
     void NoteQualifier(const TEmbeddedObject::TQualifier& qualifier, const ICIMQualifier* inherited);
     void AddProperty(TInMemClass& cls, const TEmbeddedObject::TProperty& property, const TInMemClass* super);
     void AddMethod(TInMemClass& cls, const TEmbeddedObject::TMethod& method, const TInMemClass* super);

@@ -2,6 +2,7 @@
 
 #include <utility>
 
+#include "embedded/TSchemaLimits.h"
 #include "embedded/TValueText.h"
 
 namespace NORVZEL20 {
@@ -26,8 +27,18 @@ TCimXmlDraft TCimXmlDraftBuilder::Take()
     return draft;
 }
 
+/// Fails where there are as many as there may be.
+void TCimXmlDraftBuilder::CheckRoom(std::size_t count, std::size_t most, const char* what) const
+{
+    if (count >= most)
+        fContext.Fail(EStatus::kParseError, "found more than " + std::to_string(most) + " " + what + " in " +
+                                                (fDraft->object.IsClass() ? "class " : "an instance of class ") +
+                                                TCimXmlContext::Quote(fDraft->object.GetClassName()) + "; split it");
+}
+
 void TCimXmlDraftBuilder::BeginProperty(const char* name, const TCimXmlAttributes& attributes)
 {
+    CheckRoom(fDraft->object.GetProperties().size(), TSchemaLimits::kMaxProperties, "properties");
     if (fDraft->object.FindProperty(name) != nullptr)
         fContext.Fail(EStatus::kParseError, "found property " + TCimXmlContext::Quote(name) + " a second time in one " +
                                                 (fDraft->object.IsClass() ? "class" : "instance"));
@@ -50,6 +61,7 @@ void TCimXmlDraftBuilder::EndProperty(TCIMValue value)
 
 void TCimXmlDraftBuilder::BeginMethod(const char* name, TCIMValue::TCIMType type, const TCimXmlAttributes& attributes)
 {
+    CheckRoom(fDraft->object.GetMethods().size(), TSchemaLimits::kMaxMethods, "methods");
     fMethod.emplace();
     fMethod->fName = name;
     fMethod->fType = type;
@@ -80,6 +92,11 @@ void TCimXmlDraftBuilder::EndParameter()
 
 void TCimXmlDraftBuilder::AddQualifier(TEmbeddedObject::TQualifier qualifier)
 {
+    const auto& there = fParameter  ? fParameter->fQualifiers
+                        : fMethod   ? fMethod->fQualifiers
+                        : fProperty ? fProperty->fQualifiers
+                                    : fDraft->object.GetQualifiers();
+    CheckRoom(there.size(), TSchemaLimits::kMaxQualifiers, "qualifiers on one element");
     if (fParameter)
         fParameter->fQualifiers.push_back(std::move(qualifier));
     else if (fMethod)

@@ -11,7 +11,7 @@ namespace NORVZEL20 {
 
 /// Puts a class or an instance together while its elements are read.
 ///
-/// Errors: every operation fails through the context.
+/// Errors: every operation fails through the context, also where something would go beyond TSchemaLimits.
 class TCimXmlDraftBuilder {
   public:
     explicit TCimXmlDraftBuilder(TCimXmlContext& context) : fContext(context) {}
@@ -36,6 +36,7 @@ class TCimXmlDraftBuilder {
     static ICIMQualifierDecl::EFlavor ReadFlavor(const TCimXmlAttributes& attributes);
 
   private:
+    void CheckRoom(std::size_t count, std::size_t most, const char* what) const;
     unsigned int ReadArraySize(const TCimXmlAttributes& attributes) const;
 
     TCimXmlContext& fContext;

@@ -64,24 +64,38 @@ void TCimXmlLoader::AddClass(TCimXmlDraft draft)
         return fContext.Tolerate("known class", "class " + Quote(name) + " is in the namespace already, declared the same");
     }
     fClassNumbers.emplace(name, fClasses.size());
-    fClasses.push_back({std::move(draft), TClassDraft::kWaiting});
-    fNewClasses = true;
+    fClasses.push_back({std::move(draft), TClassDraft::kNew});
     ++fContext.GetReport().classes;
 }
 
+/// Declares the classes that are new; those that are stuck wait until they are needed or the document ends.
 void TCimXmlLoader::DeclareClasses()
 {
-    fNewClasses = false;
-    for (std::size_t number = 0; number < fClasses.size(); ++number)
-        DeclareClass(number);
+    for (; fFirstNew < fClasses.size(); ++fFirstNew)
+        DeclareClass(fFirstNew);
 }
 
-/// Declares a class and, before it, those of its superclasses that wait; none of them where the topmost is not known yet.
-void TCimXmlLoader::DeclareClass(std::size_t number)
+/// Tries again to declare a class whose superclass may have come meanwhile.
+void TCimXmlLoader::DeclareStuck(const char* className)
+{
+    const auto known = fClassNumbers.find(className);
+    if (known == fClassNumbers.end())
+        return;
+    for (std::size_t next = known->second; fClasses[next].state == TClassDraft::kStuck;) {
+        fClasses[next].state = TClassDraft::kNew;
+        const auto super = fClassNumbers.find(fClasses[next].draft.object.GetSuperClassName());
+        if (super != fClassNumbers.end())
+            next = super->second;
+    }
+    DeclareClass(known->second);
+}
+
+/// The class and those of its superclasses that are new, upwards; `super` is what is declared above them.
+std::vector<std::size_t> TCimXmlLoader::CollectChain(std::size_t number, boost::shared_ptr<TInMemClass>& super)
 {
     std::vector<std::size_t> chain;
-    boost::shared_ptr<TInMemClass> super;
-    for (std::size_t next = number; fClasses[next].state == TClassDraft::kWaiting;) {
+    for (std::size_t next = number; fClasses[next].state == TClassDraft::kNew;) {
+        ++fTried;
         fClasses[next].state = TClassDraft::kVisited;
         chain.push_back(next);
         const std::string& superName = fClasses[next].draft.object.GetSuperClassName();
@@ -91,9 +105,17 @@ void TCimXmlLoader::DeclareClass(std::size_t number)
             break;
         next = waiting->second;
     }
-    for (; !chain.empty(); chain.pop_back()) {
+    return chain;
+}
+
+/// Declares a class and, before it, those of its superclasses that wait; none of them where the topmost is not known yet.
+void TCimXmlLoader::DeclareClass(std::size_t number)
+{
+    ++fTried;
+    boost::shared_ptr<TInMemClass> super;
+    for (std::vector<std::size_t> chain = CollectChain(number, super); !chain.empty(); chain.pop_back()) {
         TClassDraft& waiting = fClasses[chain.back()];
-        waiting.state = TClassDraft::kWaiting;
+        waiting.state = TClassDraft::kStuck;
         if (!super && !waiting.draft.object.GetSuperClassName().empty())
             continue;
         const TCimXmlContext::TAt at(fContext, waiting.draft.place);
@@ -114,8 +136,9 @@ TCimXmlLoader::TLayout* TCimXmlLoader::FindLayout(const char* className)
     if (known != fLayouts.end())
         return known->second.get();
     boost::shared_ptr<TInMemClass> cls = fNamespace->FindClass(className);
-    if (!cls && fNewClasses) {
+    if (!cls) {
         DeclareClasses();
+        DeclareStuck(className);
         cls = fNamespace->FindClass(className);
     }
     return cls ? AddLayout(className, cls) : nullptr;
@@ -297,6 +320,10 @@ void TCimXmlLoader::AddWaiting(const TCimXmlDraft& draft, const TReadObjects& re
 void TCimXmlLoader::Finish(const TReadObjects& readObjects)
 {
     fEnded = true;
+    for (TClassDraft& cls : fClasses)
+        if (cls.state == TClassDraft::kStuck)
+            cls.state = TClassDraft::kNew;
+    fFirstNew = 0;
     DeclareClasses();
     for (const TClassDraft& cls : fClasses)
         if (cls.state != TClassDraft::kDeclared)

@@ -57,12 +57,14 @@ class TCimXmlLoader {
     void Commit() noexcept { fStaging.Commit(); }
 
     void KeepElements() { fKeep = true; }
+    /// How often classes were looked at in order to declare them, for those who bound the work.
+    std::size_t CountTried() const noexcept { return fTried; }
     /// Classes, then instances, each in the document's order; empty without KeepElements.
     std::vector<boost::shared_ptr<ICIMElement>> TakeElements();
 
   private:
     struct TClassDraft {
-        enum EState { kWaiting, kVisited, kDeclared };
+        enum EState { kNew, kVisited, kStuck, kDeclared };  ///< stuck: tried when its topmost superclass was not known
 
         TCimXmlDraft draft;
         EState state;
@@ -84,6 +86,8 @@ class TCimXmlLoader {
 
     void DeclareClasses();
     void DeclareClass(std::size_t number);
+    void DeclareStuck(const char* className);
+    std::vector<std::size_t> CollectChain(std::size_t number, boost::shared_ptr<TInMemClass>& super);
     [[noreturn]] void RefuseClass(const TCimXmlDraft& draft) const;
     TLayout* FindLayout(const char* className);
     TLayout* AddLayout(const char* className, const boost::shared_ptr<TInMemClass>& cls);
@@ -101,6 +105,8 @@ class TCimXmlLoader {
     TInMemStaging fStaging;
     std::vector<TClassDraft> fClasses;
     TNameMap<std::size_t> fClassNumbers;
+    std::size_t fFirstNew = 0;  // of fClasses, that has not been tried yet
+    std::size_t fTried = 0;
     std::vector<THeld> fHeld;                     // instances
     std::vector<TCimXmlDraft> fWaiting;           // instances
     TNameMap<std::unique_ptr<TLayout>> fLayouts;  // by class name
@@ -110,7 +116,6 @@ class TCimXmlLoader {
     std::size_t fExpected = 0;  // the position of the property that is likely to come next
     std::vector<std::pair<boost::shared_ptr<TInMemInstance>, std::uint32_t>> fUnresolved;
     bool fMustHold = false;      // a key of the instance refers to a class that is not known yet
-    bool fNewClasses = false;    // some have not been tried yet
     bool fDeferring = false;     // instances wait
     bool fEnded = false;         // all classes are known, or will never be
     bool fDeclaredLate = false;  // a class was declared after the first instance

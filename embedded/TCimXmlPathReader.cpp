@@ -4,6 +4,7 @@
 
 #include "embedded/TNameText.h"
 #include "embedded/TReferenceAdapter.h"
+#include "embedded/TSchemaLimits.h"
 #include "embedded/TValueText.h"
 
 namespace NORVZEL20 {
@@ -188,6 +189,9 @@ void TCimXmlPathReader::AddKey(TCIMValue value)
     TFrame& frame = fFrames[fDepth - 1];
     if (frame.isInBinding && frame.keyName.empty())
         fContext.Fail(EStatus::kParseError, "found a second value in one <KEYBINDING>, expected one");
+    if (frame.keys.size() == TSchemaLimits::kMaxKeyBindings)
+        fContext.Fail(EStatus::kParseError,
+                      "found more than " + std::to_string(TSchemaLimits::kMaxKeyBindings) + " key bindings in one path");
     frame.keys.emplace_back(frame.keyName, std::move(value));
     frame.keyName.clear();
 }

@@ -23,6 +23,10 @@ namespace NORVZEL20 {
 /// statuses of TNamespacePopulator::PopulateFromXMLFile, 31 where the namespace is none of the provider "inmem"; std::bad_alloc.
 /// Nothing is logged. Threads: one at a time for each populator and namespace; several populators may work at once on namespaces of
 /// their own. Cost: one pass over the document; it is never held whole, but LoadFromMemory has the XML library copy it.
+/// Bounds, beyond which a document is refused with status 9: those of TXmlReader; 1000 superclasses of a class; 1024 properties of
+/// a class, an instance or an embedded object; 1024 methods of a class; 1024 qualifiers of an element; 256 key bindings of a path;
+/// 12 paths and 32 embedded objects within each other. Classes and elements count with what they inherit. An embedded object must
+/// not have a document type declaration (status 13).
 class TCimXmlPopulator {
   public:
     /// Fills the buffer with at most so many bytes and returns how many; 0 ends the document, and is asked for once. May deliver as
@@ -40,10 +44,11 @@ class TCimXmlPopulator {
     /// Loads the file at `path`. Errors: also status 11 where it cannot be opened or read.
     TLoadReport LoadFile(const std::string& path);
 
-    /// From now on keeps what is loaded; for TakeElements.
+    /// From now on keeps what each load loads; for TakeElements.
     void KeepElements() { fKeep = true; }
 
-    /// The classes, then the instances loaded since the last call, each in the document's order. Empty without KeepElements.
+    /// The classes, then the instances of the last load that did not fail, each in the document's order. Empty without
+    /// KeepElements, and where they have been taken already.
     std::vector<boost::shared_ptr<ICIMElement>> TakeElements();
 
   private:

@@ -46,7 +46,10 @@ class TCimXmlReader::TEmbedded {
   public:
     TEmbedded(TCimXmlContext& context, const boost::shared_ptr<TInMemNamespace>& ns)
         : fContext(context), fSink(context, ns, nullptr), fXml(fSink)
-    {}
+    {
+        // Each text within a text would have entities of its own to expand, each to the limit of a whole document.
+        fXml.RefuseDocumentTypes();
+    }
 
     boost::shared_ptr<const TEmbeddedObject> Read(std::string_view text)
     {

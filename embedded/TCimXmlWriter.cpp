@@ -125,6 +125,7 @@ std::vector<boost::shared_ptr<ICIMClass>> TCimXmlWriter::CollectClasses(ICIMName
 
 void TCimXmlWriter::StartDocument(const std::string& namespaceName, const std::string& host)
 {
+    fEnded = false;
     fBuffer.clear();  // of what a document that failed may have left
     fBuffer += "<?xml version=\"1.0\" encoding=\"utf-8\"?>\n<CIM CIMVERSION=\"2.0\" DTDVERSION=\"2.0\"><DECLARATION><DECLGROUP>\n";
     if (!namespaceName.empty())
@@ -171,8 +172,11 @@ void TCimXmlWriter::WriteInstance(const ICIMInstance& instance)
 
 void TCimXmlWriter::EndDocument()
 {
-    fBuffer += "</DECLGROUP></DECLARATION></CIM>\n";
-    Flush();
+    if (!fEnded)
+        fBuffer += "</DECLGROUP></DECLARATION></CIM>\n";
+    fEnded = true;
+    if (!fBuffer.empty())
+        Flush();
 }
 
 std::string TCimXmlWriter::InstanceToXml(const ICIMInstance& instance)

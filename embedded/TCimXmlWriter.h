@@ -17,7 +17,8 @@ namespace NORVZEL20 {
 /// Text reaches the sink in pieces of some 64 KiB, in UTF-8; nothing is held beyond that. What XML readers would change is
 /// written as a character reference; a control character that XML 1.0 cannot carry becomes U+FFFD. Output depends on the contents
 /// of the namespace alone. Errors: what the sink or the namespace throws; an element that could not be told whole is not written at
-/// all, a piece that the sink refused is offered again by what is written next, and StartDocument begins anew.
+/// all. A piece that the sink refused is kept, with the element that filled it, which counts as written: the next piece begins with
+/// it, and EndDocument may be called again to offer it again. StartDocument begins anew.
 class TCimXmlWriter {
   public:
     using TSink = boost::function<void(std::string_view)>;
@@ -39,6 +40,7 @@ class TCimXmlWriter {
     void WriteClass(const ICIMClass& cls);
     /// One VALUE.OBJECT with the INSTANCE; null properties are written without a value.
     void WriteInstance(const ICIMInstance& instance);
+    /// Called again, it offers what the sink has not taken, if anything.
     void EndDocument();
 
     /// The element INSTANCE alone, in one line.
@@ -52,6 +54,7 @@ class TCimXmlWriter {
 
     TSink fSink;
     std::string fBuffer;
+    bool fEnded = false;  // the end tags are in the buffer, or written
 };
 
 }  // namespace NORVZEL20

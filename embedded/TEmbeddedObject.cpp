@@ -61,6 +61,19 @@ bool Equal(const TEmbeddedObject::TMethod& a, const TEmbeddedObject::TMethod& b)
            EqualSorted(SortByName(a.fQualifiers), SortByName(b.fQualifiers));
 }
 
+/// An array may be a bag here and none in the object it is compared with: whatever is equal then must agree.
+std::size_t HashWithoutOrder(const TCIMValue& value)
+{
+    if (value.IsNull() || !value.GetType().IsArray()) {
+        return value.Hash();
+    }
+    std::size_t hash = value.GetElements().size();
+    for (const TCIMValue& element : value.GetElements()) {
+        hash += (element.Hash() ^ 0x9E3779B9u) * 0x9E3779B97F4A7C15u;
+    }
+    return hash;
+}
+
 std::vector<const TEmbeddedObject::TProperty*> GetComparedProperties(const TEmbeddedObject& object)
 {
     auto properties = SortByName(object.GetProperties());
@@ -115,9 +128,9 @@ std::size_t TEmbeddedObject::Hash() const
 {
     std::size_t hash = TNameText::Hash(fClassName) + (fIsClass ? 1u : 0u);
     for (const TProperty& property : fProperties) {
-        // A sum, so that the order does not matter; an array within may be a bag, whose order does not matter either.
+        // A sum, so that the order does not matter.
         hash += property.fValue.IsNull() ? 0 : TNameText::Hash(property.fName);
-        hash += property.fValue.GetType().IsArray() ? 0 : property.fValue.Hash() * 31;
+        hash += HashWithoutOrder(property.fValue) * 31;
     }
     return hash;
 }

@@ -164,6 +164,15 @@ boost::shared_ptr<ICIMClass> TInMemClass::GetSuperClass(TCallContext) const
     return fSuper;
 }
 
+std::size_t TInMemClass::CountSuperClasses() const noexcept
+{
+    std::size_t count = 0;
+    for (const TInMemClass* cls = fSuper.get(); cls; cls = cls->fSuper.get()) {
+        ++count;
+    }
+    return count;
+}
+
 std::vector<boost::shared_ptr<TInMemClass>> TInMemClass::GetSubClasses() const
 {
     std::vector<boost::shared_ptr<TInMemClass>> classes;
@@ -212,6 +221,16 @@ bool TInMemClass::IsSubclassOf(std::string_view name) const noexcept
 bool TInMemClass::IsSubclassOf(boost::shared_ptr<const ICIMClass> cls, TCallContext context) const
 {
     return IsSubclassOf(cls->GetName(context));
+}
+
+void TInMemClass::EnumerateKeyNames(const boost::function<bool(const std::string*)>& callback, TCallContext) const
+{
+    const std::vector<std::uint32_t> slots = fKeySlots;
+    for (const std::uint32_t slot : slots) {
+        if (!callback(&fSlots[slot]->GetName())) {
+            return;
+        }
+    }
 }
 
 boost::shared_ptr<TInMemInstance> TInMemClass::AllocateInMemInstance()
@@ -317,12 +336,19 @@ bool TInMemClass::RemoveInstance(boost::shared_ptr<ICIMInstance> instance)
     return own && own->GetInMemClass().get() == this && GetExtent().Remove(*own);
 }
 
-bool TInMemClass::HasInstances() const
+/// Instances are told apart by their keys: none may go while there are any, here or below, that have it because of `decl` alone.
+void TInMemClass::CheckKeyStays(const TInMemPropertyDecl& decl) const
 {
-    const auto below = GetClassesBelow();
-    return GetInstanceCount() > 0 || std::any_of(below.begin(), below.end(), [](const boost::shared_ptr<TInMemClass>& cls) {
-               return cls->GetInstanceCount() > 0;
-           });
+    const auto check = [&decl](const TInMemClass& cls) {
+        const auto there = cls.FindPropertyDecl(decl.GetName());
+        if (cls.GetInstanceCount() > 0 && there && there->IsKey() && !there->IsKeyWithout(decl)) {
+            throw TZELException(TZELStatusCode::kClassInUse);
+        }
+    };
+    check(*this);
+    for (const auto& cls : GetClassesBelow()) {
+        check(*cls);
+    }
 }
 
 void TInMemClass::SetSpelling(const std::string& name)

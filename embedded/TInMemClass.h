@@ -90,7 +90,7 @@ class TInMemClass final : public TInMemNamedElement<ICIMClass>, public boost::en
     /// `decl` must come from AllocatePropertyDecl and be in no class yet, else status 5. One that an ancestor declares is
     /// overridden by it: status 13 where the types differ. Subclasses get the property too. A key comes last among the keys.
     bool AddPropertyDecl(boost::shared_ptr<ICIMPropertyDecl> decl) override;
-    /// False for an inherited one. Errors: status 19 for a key of a class with instances.
+    /// False for an inherited one. Errors: status 19 where this class, or one below, has instances and would lose a key.
     bool RemovePropertyDecl(boost::shared_ptr<ICIMPropertyDecl> decl) override;
     bool AddMethodDecl(boost::shared_ptr<ICIMMethodDecl> decl) override;
     bool RemoveMethodDecl(boost::shared_ptr<ICIMMethodDecl> decl) override;
@@ -102,6 +102,8 @@ class TInMemClass final : public TInMemNamedElement<ICIMClass>, public boost::en
     bool IsSubclassOf(std::string_view name) const noexcept;
     /// Null for a top-level class.
     const boost::shared_ptr<TInMemClass>& GetSuperInMemClass() const noexcept { return fSuper; }
+    /// How many classes are above this one. Cost: in proportion to them.
+    std::size_t CountSuperClasses() const noexcept;
     /// The direct subclasses in order of declaration.
     std::vector<boost::shared_ptr<TInMemClass>> GetSubClasses() const;
     /// All classes below this one, each before its own subclasses.
@@ -149,7 +151,7 @@ class TInMemClass final : public TInMemNamedElement<ICIMClass>, public boost::en
     boost::shared_ptr<TInMemNamespace> RequireNamespace() const;
     TInMemExtent& GetExtent() const;
     TCIMReference MakePath() const;
-    bool HasInstances() const;
+    void CheckKeyStays(const TInMemPropertyDecl& decl) const;
     bool IsPseudoClass() const noexcept;
 
     boost::shared_ptr<TInMemPropertyDecl> FindOwnDecl(std::string_view name) const;
@@ -157,6 +159,7 @@ class TInMemClass final : public TInMemNamedElement<ICIMClass>, public boost::en
     void InheritSlots();
     void InheritDecl(std::string_view name);
     void AppendSlot(const boost::shared_ptr<TInMemPropertyDecl>& decl);
+    void TakeIn(const boost::shared_ptr<TInMemPropertyDecl>& decl, std::size_t position);
     void CheckOverrides(const TInMemPropertyDecl& decl) const;
     void ReserveSlot();
     std::vector<boost::shared_ptr<TInMemClass>> PrepareChange();

@@ -137,6 +137,23 @@ void TInMemClass::DeclChanged(const TInMemPropertyDecl& decl, const std::vector<
     }
 }
 
+/// Takes over a declaration that is new here or above, which comes at `position` where the name is new to this class: the common
+/// case, in which nothing is gone over that the class has already.
+void TInMemClass::TakeIn(const boost::shared_ptr<TInMemPropertyDecl>& decl, std::size_t position)
+{
+    if (FindSlot(decl->GetName()) != kNoSlot) {
+        InheritDecl(decl->GetName());
+        UpdateLayout();
+        return;
+    }
+    AppendSlot(decl);
+    fOrder.insert(fOrder.begin() + std::ptrdiff_t(position), GetSlotCount() - 1);
+    ++fLayout;
+    if (decl->IsKey()) {
+        UpdateKeys();
+    }
+}
+
 void TInMemClass::UpdateLayout()
 {
     ++fLayout;
@@ -179,16 +196,6 @@ void TInMemClass::UpdateKeys()
     fKeySlots.resize(count);
     if (changed && fExtent) {
         fExtent->KeysChanged();
-    }
-}
-
-void TInMemClass::EnumerateKeyNames(const boost::function<bool(const std::string*)>& callback, TCallContext) const
-{
-    const std::vector<std::uint32_t> slots = fKeySlots;
-    for (const std::uint32_t slot : slots) {
-        if (!callback(&fSlots[slot]->GetName())) {
-            return;
-        }
     }
 }
 
@@ -250,16 +257,21 @@ bool TInMemClass::AddPropertyDecl(boost::shared_ptr<ICIMPropertyDecl> decl)
     const auto below = PrepareChange();
     fOwn.push_back(own);
     own->fOwner = weak_from_this();
-    if (there || !fSubClasses.empty()) {
+    if (there && !fSubClasses.empty()) {
         DeclChanged(*own, below);
-        return true;
-    }
-    // The common case while a class is built, without going over all that it has already.
-    AppendSlot(own);
-    fOrder.push_back(GetSlotCount() - 1);
-    ++fLayout;
-    if (own->IsKey()) {
-        UpdateKeys();
+    } else if (there) {
+        own->Override(there);
+        fSlots[FindSlot(own->GetName())] = own;
+        ++fLayout;
+        if (own->IsKey() != there->IsKey()) {
+            UpdateKeys();
+        }
+    } else {
+        const std::size_t position = fOrder.size();
+        TakeIn(own, position);
+        for (const auto& cls : below) {
+            cls->TakeIn(own, position);
+        }
     }
     return true;
 }
@@ -271,9 +283,7 @@ bool TInMemClass::RemovePropertyDecl(boost::shared_ptr<ICIMPropertyDecl> decl)
         return false;
     }
     const auto own = *at;
-    if (own->IsKey() && !own->GetOverridden() && HasInstances()) {
-        throw TZELException(TZELStatusCode::kClassInUse);
-    }
+    CheckKeyStays(*own);
     const auto below = GetClassesBelow();
     fOwn.erase(at);
     own->fOwner.reset();

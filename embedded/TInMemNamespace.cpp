@@ -1,8 +1,8 @@
 #include "embedded/TInMemNamespace.h"
 
-#include <algorithm>
 #include <boost/smart_ptr/make_shared.hpp>
 
+#include "embedded/EraseLast.h"
 #include "embedded/TInMemNamespaceProvider.h"
 #include "embedded/TQuery.h"
 #include "host/TZELException.h"
@@ -153,11 +153,8 @@ void TInMemNamespace::Withdraw(TInMemClass& cls) noexcept
     const auto keep = cls.shared_from_this();
     const auto isIt = [&cls](const boost::weak_ptr<TInMemClass>& weak) { return weak.lock().get() == &cls; };
     std::vector<boost::weak_ptr<TInMemClass>>& siblings = GetParent(cls).fSubClasses;
-    siblings.erase(std::remove_if(siblings.begin(), siblings.end(), isIt), siblings.end());
-    const auto at = std::find(fClasses.rbegin(), fClasses.rend(), keep);
-    if (at != fClasses.rend()) {
-        fClasses.erase(std::next(at).base());
-    }
+    EraseLast(siblings, isIt);
+    EraseLast(fClasses, [&keep](const boost::shared_ptr<TInMemClass>& other) { return other == keep; });
     const auto entry = fClassesByName.find(cls.GetName());
     if (entry != fClassesByName.end() && entry->second.cls == keep) {
         fClassesByName.erase(entry);
@@ -189,8 +186,7 @@ void TInMemNamespace::AddQualifierDecl(boost::shared_ptr<TInMemQualifierDecl> de
 void TInMemNamespace::Withdraw(const TInMemQualifierDecl& decl) noexcept
 {
     fQualifierDeclsByName.erase(decl.GetName());
-    const auto isIt = [&decl](const boost::shared_ptr<TInMemQualifierDecl>& other) { return other.get() == &decl; };
-    fQualifierDecls.erase(std::remove_if(fQualifierDecls.begin(), fQualifierDecls.end(), isIt), fQualifierDecls.end());
+    EraseLast(fQualifierDecls, [&decl](const boost::shared_ptr<TInMemQualifierDecl>& other) { return other.get() == &decl; });
 }
 
 boost::shared_ptr<ICIMQualifierDecl> TInMemNamespace::AllocateQualifierDecl(const std::string& name, const TCIMValue& value,

@@ -84,12 +84,26 @@ void TInMemPropertyDecl::SetSpelling(const std::string& name)
 void TInMemPropertyDecl::PutQualifier(boost::shared_ptr<ICIMQualifier> qualifier)
 {
     const auto owner = fOwner.lock();
+    if (owner && TInMemQualifierSet::IsNamed(*qualifier, "Key") && !TInMemQualifierSet::HoldsTrue(*qualifier)) {
+        owner->CheckKeyStays(*this);
+    }
     const auto below = owner ? owner->PrepareChange() : std::vector<boost::shared_ptr<TInMemClass>>();
     TInMemNamedElement<ICIMPropertyDecl>::PutQualifier(std::move(qualifier));
     UpdateMarks();
     if (owner) {
         owner->DeclChanged(*this, below);
     }
+}
+
+/// Whether it would still be a key if `other`, this one or one that it overrides, did not say so.
+bool TInMemPropertyDecl::IsKeyWithout(const TInMemPropertyDecl& other) const
+{
+    for (const TInMemPropertyDecl* decl = this; decl; decl = decl->fOverridden.get()) {
+        if (decl != &other && decl->GetQualifiers().IsOwnTrue("Key")) {
+            return true;
+        }
+    }
+    return false;
 }
 
 void TInMemPropertyDecl::UpdateMarks()

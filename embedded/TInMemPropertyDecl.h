@@ -14,7 +14,8 @@ class TInMemClass;
 
 /// A property's declaration in an in-memory class.
 ///
-/// Made by TInMemClass::AllocatePropertyDecl, given its qualifiers, then added with TInMemClass::AddPropertyDecl.
+/// Made by TInMemClass::AllocatePropertyDecl, given its qualifiers, then added with TInMemClass::AddPropertyDecl. From then on
+/// AddQualifier throws status 19 where a Key that is not true would take a key away from a class with instances.
 class TInMemPropertyDecl : public TInMemNamedElement<ICIMPropertyDecl>, public boost::enable_shared_from_this<TInMemPropertyDecl> {
   public:
     /// The value gives type and default. A reference in it names the class that references point to; without keys it is no default.
@@ -67,6 +68,7 @@ class TInMemPropertyDecl : public TInMemNamedElement<ICIMPropertyDecl>, public b
     void PutQualifier(boost::shared_ptr<ICIMQualifier> qualifier) override;
     void UpdateMarks();
     bool IsBagDeclared() const;
+    bool IsKeyWithout(const TInMemPropertyDecl& other) const;
     void Override(boost::shared_ptr<TInMemPropertyDecl> overridden);
 
     std::string fName;

@@ -6,23 +6,23 @@ namespace NORVZEL20 {
 
 namespace {
 
-bool IsNamed(const ICIMQualifier& qualifier, std::string_view name)
-{
-    return TNameText::Equal(qualifier.GetName(TCallContext()), name);
-}
-
-bool HoldsTrue(const ICIMQualifier& qualifier)
-{
-    const TCIMValue& value = qualifier.GetValue(TCallContext());
-    return value.GetType() == TCIMValue::TCIMType::kBoolean && !value.IsNull() && value.GetBoolean();
-}
-
 bool IsInherited(const ICIMQualifier& qualifier)
 {
     return (qualifier.GetFlavor(TCallContext()) & ICIMQualifierDecl::kFlavorToSubclass) != 0;
 }
 
 }  // namespace
+
+bool TInMemQualifierSet::IsNamed(const ICIMQualifier& qualifier, std::string_view name)
+{
+    return TNameText::Equal(qualifier.GetName(TCallContext()), name);
+}
+
+bool TInMemQualifierSet::HoldsTrue(const ICIMQualifier& qualifier)
+{
+    const TCIMValue& value = qualifier.GetValue(TCallContext());
+    return value.GetType() == TCIMValue::TCIMType::kBoolean && !value.IsNull() && value.GetBoolean();
+}
 
 void TInMemQualifierSet::Add(boost::shared_ptr<ICIMQualifier> qualifier)
 {
@@ -68,6 +68,15 @@ void TInMemQualifierSet::Enumerate(const boost::function<bool(boost::shared_ptr<
             }
         }
     }
+}
+
+std::size_t TInMemQualifierSet::CountAll() const noexcept
+{
+    std::size_t count = 0;
+    for (const TInMemQualifierSet* set = this; set; set = set->fParent) {
+        count += set->fOwn.size();
+    }
+    return count;
 }
 
 bool TInMemQualifierSet::IsTrue(std::string_view name) const

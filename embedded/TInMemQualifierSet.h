@@ -14,6 +14,11 @@ namespace NORVZEL20 {
 /// A qualifier is inherited where its flavor says so (to the subclass) and the element has none of that name itself.
 class TInMemQualifierSet {
   public:
+    /// Letter case does not count.
+    static bool IsNamed(const ICIMQualifier& qualifier, std::string_view name);
+    /// Whether its value is TRUE.
+    static bool HoldsTrue(const ICIMQualifier& qualifier);
+
     /// Names the set to inherit from; null for none. It must outlive this one.
     void SetParent(const TInMemQualifierSet* parent) noexcept { fParent = parent; }
 
@@ -27,6 +32,8 @@ class TInMemQualifierSet {
 
     /// The element's own ones, in the order they were added.
     const std::vector<boost::shared_ptr<ICIMQualifier>>& GetOwn() const noexcept { return fOwn; }
+    /// How many there are in this set and in those above it, hidden ones included.
+    std::size_t CountAll() const noexcept;
     /// Whether there is one of that name, own or inherited, with the value TRUE.
     bool IsTrue(std::string_view name) const;
     /// Whether the element itself has one of that name with the value TRUE.

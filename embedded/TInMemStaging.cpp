@@ -18,8 +18,8 @@ TInMemStaging::~TInMemStaging()
     for (auto cls = fClasses.rbegin(); cls != fClasses.rend(); ++cls) {
         fNamespace->Withdraw(**cls);
     }
-    for (const auto& decl : fQualifierDecls) {
-        fNamespace->Withdraw(*decl);
+    for (auto decl = fQualifierDecls.rbegin(); decl != fQualifierDecls.rend(); ++decl) {
+        fNamespace->Withdraw(**decl);
     }
 }
 

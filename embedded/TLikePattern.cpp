@@ -40,9 +40,12 @@ std::vector<char32_t> Decode(std::string_view text)
 TLikePattern::TLikePattern(std::string_view pattern)
 {
     const std::vector<char32_t> characters = Decode(pattern);
+    bool canClose = true;  // whether a bracket may still be closed: where one is not, neither are those behind it
     for (std::size_t at = 0; at < characters.size();) {
         const char32_t character = characters[at];
-        const std::size_t end = character == U'[' ? ReadSet(characters, at + 1) : 0;
+        const bool opens = character == U'[' && canClose;
+        const std::size_t end = opens ? ReadSet(characters, at + 1) : 0;
+        canClose = canClose && (!opens || end != 0);
         if (end != 0) {
             at = end;
             continue;

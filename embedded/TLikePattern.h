@@ -11,7 +11,7 @@ namespace NORVZEL20 {
 /// other. Whatever stands in brackets alone means itself: [%] is a percent sign. A bracket that is not closed means itself too.
 class TLikePattern {
   public:
-    /// UTF-8; bytes that are not count as one character each.
+    /// UTF-8; bytes that are not count as one character each. Cost: in proportion to the pattern.
     explicit TLikePattern(std::string_view pattern);
 
     /// Whether the whole of `text` fits. Letter case counts. At most the product of both lengths in steps.

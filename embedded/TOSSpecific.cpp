@@ -1,5 +1,7 @@
 #include "host/TOSSpecific.h"
 
+#include <dlfcn.h>
+
 #include <cstdlib>
 #include <filesystem>
 
@@ -7,17 +9,34 @@
 
 namespace NORVZEL20 {
 
+namespace {
+
+/// The folder of the library that this is part of, links followed; empty where that cannot be told.
+std::filesystem::path FindLibraryFolder()
+{
+    static const char inTheLibrary = '\0';
+    Dl_info info;
+    std::error_code error;
+    if (dladdr(&inTheLibrary, &info) == 0 || info.dli_fname == nullptr) {
+        return std::filesystem::path();
+    }
+    return std::filesystem::canonical(info.dli_fname, error).parent_path();
+}
+
+}  // namespace
+
 std::string TOSSpecific::GetZELRootPath()
 {
     const char* const chosen = std::getenv("CIMDELTA_ROOT");
     if (chosen != nullptr && *chosen != '\0') {
         return chosen;
     }
+    const std::filesystem::path folder = FindLibraryFolder();
+    const std::filesystem::path installed = folder / CIMDELTA_INSTALLED_ROOT;
+    const std::filesystem::path built = folder / CIMDELTA_BUILD_ROOT;
     std::error_code error;
-    if (std::filesystem::exists(CIMDELTA_INSTALLED_ROOT "/data/deltaclasses.properties.xml", error)) {
-        return CIMDELTA_INSTALLED_ROOT;
-    }
-    return CIMDELTA_SOURCE_ROOT;
+    const bool isBuilt = !std::filesystem::exists(installed / "data", error) && std::filesystem::exists(built / "data", error);
+    return (isBuilt ? built : installed).lexically_normal().string();
 }
 
 std::uint64_t TOSSpecific::GetFileSize(std::string path)

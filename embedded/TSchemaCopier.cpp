@@ -2,8 +2,31 @@
 
 #include "embedded/TDeclCopy.h"
 #include "embedded/TInMemStaging.h"
+#include "embedded/TSchemaLimitError.h"
+#include "embedded/TSchemaLimits.h"
 
 namespace NORVZEL20 {
+
+namespace {
+
+void CheckHeight(const TInMemClass& cls)
+{
+    if (cls.CountSuperClasses() > TSchemaLimits::kMaxSuperClasses) {
+        throw TSchemaLimitError("it would be below more than " + std::to_string(TSchemaLimits::kMaxSuperClasses) +
+                                " superclasses; flatten the class tree");
+    }
+}
+
+/// Whether the class has room for so many properties.
+void CheckWidth(const TInMemClass& cls, std::size_t properties)
+{
+    if (properties > TSchemaLimits::kMaxProperties) {
+        throw TSchemaLimitError("class " + cls.GetName() + " would have more than " +
+                                std::to_string(TSchemaLimits::kMaxProperties) + " properties; split it");
+    }
+}
+
+}  // namespace
 
 std::vector<boost::shared_ptr<TInMemClass>> TSchemaCopier::CopyClass(const TInMemClass& source)
 {
@@ -26,11 +49,13 @@ boost::shared_ptr<TInMemClass> TSchemaCopier::MakeClass(const TInMemClass& sourc
     const auto& superClass = source.GetSuperInMemClass();
     const auto from = source.GetInMemNamespace();
     auto copy = fTarget->AllocateInMemClass(source.GetName(), superClass ? fTarget->FindClass(superClass->GetName()) : nullptr);
+    CheckHeight(*copy);
     CopyQualifierDecls(source.GetQualifiers(), from.get());
     TDeclCopy::CopyOwnQualifiers(source.GetQualifiers(), *copy);
     for (const auto& decl : source.GetOwnPropertyDecls()) {
         CopyQualifierDecls(decl->GetQualifiers(), from.get());
         copy->AddPropertyDecl(TDeclCopy::CopyProperty(*decl));
+        CheckWidth(*copy, copy->GetSlotOrder().size());
     }
     for (const auto& method : source.GetOwnMethodDecls()) {
         CopyQualifierDecls(method->GetQualifiers(), from.get());
@@ -43,6 +68,10 @@ boost::shared_ptr<TInMemPropertyDecl> TSchemaCopier::CopyPropertyDecl(const TInM
 {
     if (cls.FindPropertyDecl(source.GetName())) {
         return nullptr;
+    }
+    CheckWidth(cls, cls.GetSlotOrder().size() + 1);
+    for (const auto& below : cls.GetClassesBelow()) {
+        CheckWidth(*below, below->GetSlotOrder().size() + (below->FindPropertyDecl(source.GetName()) ? 0 : 1));
     }
     const auto owner = source.GetOwner();
     const auto from = owner ? owner->GetInMemNamespace() : nullptr;

@@ -19,12 +19,12 @@ class TSchemaCopier {
     /// Declares `source` with all that it declares itself, after those of its superclasses that the target lacks. Returns the
     /// classes declared, superclasses first; none where the target has the class (in whatever spelling).
     /// A class named by a reference need not be there. Errors: status 13 where an inherited property has another type in the
-    /// target; no class is declared then.
+    /// target, TSchemaLimitError where a class would go beyond TSchemaLimits; no class is declared then.
     std::vector<boost::shared_ptr<TInMemClass>> CopyClass(const TInMemClass& source);
 
     /// Declares a property of another namespace's class in `cls`, a class of the target, with its qualifiers. Returns null where
     /// it has the property (own or inherited). Instances that are there get a null. Errors: status 13 where a subclass has the
-    /// property with another type.
+    /// property with another type, TSchemaLimitError where the class, or one below, would have too many.
     boost::shared_ptr<TInMemPropertyDecl> CopyPropertyDecl(const TInMemPropertyDecl& source, TInMemClass& cls);
 
     /// Gives the target's class, where it has one, the spelling `name`; false where it is spelled so, or there is none.

@@ -78,6 +78,11 @@ struct TXmlReader::TCallbacks {
         Guarded(user, [=](TXmlReader& reader) { reader.fSink.OnNotation(name, publicId, systemId); });
     }
 
+    static void DocumentType(void* user, const char*, const char*, const char*, int) noexcept
+    {
+        Guarded(user, [](TXmlReader& reader) { reader.Refuse("a document type declaration may not stand here"); });
+    }
+
     /// Entities expand recursively inside the library, so their number bounds its stack.
     static void Entity(void* user, const char*, int, const char*, int, const char*, const char*, const char*, const char*) noexcept
     {
@@ -116,6 +121,7 @@ void TXmlReader::Install()
     XML_SetCharacterDataHandler(parser, TCallbacks::Text);
     XML_SetProcessingInstructionHandler(parser, TCallbacks::Instruction);
     XML_SetNotationDeclHandler(parser, TCallbacks::Notation);
+    XML_SetStartDoctypeDeclHandler(parser, fRefusesDocumentTypes ? TCallbacks::DocumentType : nullptr);
     XML_SetEntityDeclHandler(parser, TCallbacks::Entity);
     XML_SetExternalEntityRefHandler(parser, TCallbacks::ExternalEntity);
     XML_SetSkippedEntityHandler(parser, TCallbacks::SkippedEntity);

@@ -47,6 +47,9 @@ class TXmlReader {
     TXmlReader& operator=(const TXmlReader&) = delete;
     ~TXmlReader();
 
+    /// From the next Reset on, a document with a document type declaration, and so one with entities of its own, is in error.
+    void RefuseDocumentTypes() noexcept { fRefusesDocumentTypes = true; }
+
     /// Makes the reader ready for a new document; `encoding` (may be null) overrides what the document says of its own.
     /// Errors: std::bad_alloc.
     void Reset(const char* encoding = nullptr);
@@ -96,6 +99,7 @@ class TXmlReader {
     std::string fError;
     std::exception_ptr fException;
     bool fStopped = false;
+    bool fRefusesDocumentTypes = false;
     std::size_t fLine = 0;  // where the parse was stopped
     std::size_t fColumn = 0;
 };

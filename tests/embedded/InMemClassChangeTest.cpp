@@ -13,6 +13,23 @@ TEST_F(InMemClassChangeTest, APropertyThatComesLateReachesAllBelow)
     EXPECT_EQ("Id Serial", PropertiesOf(*device));
 }
 
+TEST_F(InMemClassChangeTest, PropertiesThatComeLateComeInTheOrderOfThoseThatComeEarly)
+{
+    const auto tape = Declare("Tape", fan, {{"Serial", TType::kString, {}}, {"Length", TType::kUint32, {}}});
+    const auto reel = Declare("Reel", tape, {{"Width", TType::kUint8, {}}});
+    disk->AddPropertyDecl(Decl({"Blocks", TType::kUint64, {}}));
+    device->AddPropertyDecl(Decl({"Serial", TType::kString, {}}));
+    device->AddPropertyDecl(Decl({"Weight", TType::kUint32, {"Key"}}));
+    fan->AddPropertyDecl(Decl({"Blades", TType::kUint8, {}}));
+    EXPECT_EQ("Id Serial Weight Speed Blades Length Width", PropertiesOf(*reel));
+    EXPECT_EQ("Id Serial Weight Size Blocks Wear", PropertiesOf(*solidState));
+    EXPECT_EQ("Id Weight", KeysOf(*reel));
+    EXPECT_EQ("Id Weight", KeysOf(*solidState));
+    EXPECT_EQ(tape, boost::dynamic_pointer_cast<TInMemPropertyDecl>(reel->GetPropertyDecl("Serial", none))->GetOwner());
+    EXPECT_EQ("Id=r1 Serial=NULL Weight=NULL Speed=NULL Blades=NULL Length=NULL Width=7",
+              ValuesOf(*Allocate(reel, {{"Id", "r1"}, {"Width", TCIMValue(std::uint8_t(7))}})));
+}
+
 TEST_F(InMemClassChangeTest, ASubclassThatIsDeclaredLateHasWhatItsSuperclassGotMeanwhile)
 {
     const auto tape = Allocate("Tape", device, {{"Length", TType::kUint32, {}}});
@@ -87,6 +104,46 @@ TEST_F(InMemClassChangeTest, AKeyOfAClassWithInstancesStays)
     Add(fan, {{"Id", "fan0"}});
     EXPECT_EQ(19, StatusOf([&] { device->RemovePropertyDecl(key); }));
     EXPECT_EQ("Id", KeysOf(*fan));
+}
+
+/// Two instances would have one path.
+TEST_F(InMemClassChangeTest, AKeyThatAnOverrideMadeStaysWhileThereAreInstances)
+{
+    const auto label = Decl({"Label", TType::kString, {}});
+    const auto own = Decl({"Label", TType::kString, {"Key"}});
+    device->AddPropertyDecl(label);
+    disk->AddPropertyDecl(own);
+    Add(solidState, {{"Id", "sda"}, {"Label", "one"}});
+    Add(solidState, {{"Id", "sda"}, {"Label", "two"}});
+    EXPECT_EQ(19, StatusOf([&] { disk->RemovePropertyDecl(own); }));
+    EXPECT_EQ("Id Label", KeysOf(*solidState));
+    ns->ClearInstances();
+    Add(fan, {{"Id", "fan0"}, {"Label", "none of its keys"}});
+    EXPECT_TRUE(disk->RemovePropertyDecl(own));
+    EXPECT_EQ("Id", KeysOf(*solidState));
+}
+
+TEST_F(InMemClassChangeTest, AnOverrideThatRepeatsTheKeyMayGo)
+{
+    const auto own = Decl({"Id", TType::kString, {"Key"}});
+    disk->AddPropertyDecl(own);
+    Add(disk, {{"Id", "sda"}});
+    EXPECT_EQ(0, StatusOf([&] { own->AddQualifier(Qualifier("Key", TCIMValue(false)), none); }));
+    EXPECT_TRUE(disk->RemovePropertyDecl(own));
+    EXPECT_EQ("Id", KeysOf(*disk));
+}
+
+TEST_F(InMemClassChangeTest, AKeyIsNotUnsaidWhileThereAreInstances)
+{
+    const auto id = device->GetPropertyDecl("Id", none);
+    Add(fan, {{"Id", "fan0"}});
+    EXPECT_EQ(19, StatusOf([&] { id->AddQualifier(Qualifier("KEY", TCIMValue(false)), none); }));
+    EXPECT_EQ("Id", KeysOf(*fan));
+    EXPECT_EQ("Key", QualifiersOf(*id));
+    EXPECT_EQ(0, StatusOf([&] { id->AddQualifier(Qualifier("Key"), none); }));
+    ns->ClearInstances();
+    EXPECT_EQ(0, StatusOf([&] { id->AddQualifier(Qualifier("Key", TCIMValue(false)), none); }));
+    EXPECT_EQ("", KeysOf(*fan));
 }
 
 TEST_F(InMemClassChangeTest, AKeyThatComesLateLeavesInstancesToBeFound)

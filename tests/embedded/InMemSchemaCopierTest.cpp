@@ -1,5 +1,6 @@
 #include "embedded/TSchemaCopier.h"
 
+#include "embedded/TSchemaLimits.h"
 #include "tests/embedded/InMemFixture.h"
 
 namespace NORVZEL20 {
@@ -51,6 +52,28 @@ TEST_F(InMemSchemaCopierTest, WhatIsThereIsLeftAlone)
     EXPECT_EQ("DEVICE", declared[0]->GetSuperInMemClass()->GetName());
     EXPECT_TRUE(copier.CopyClass(*disk).empty());
     EXPECT_TRUE(copier.CopyClass(*device).empty());
+}
+
+TEST_F(InMemSchemaCopierTest, WhatIsJoinedKeepsToTheLimits)
+{
+    const auto there = target->AllocateInMemClass("Disk", target->AllocateInMemClass("Thing", nullptr));
+    there->GetSuperInMemClass()->AddToNamespace(none);
+    there->AddToNamespace(none);
+    for (std::size_t number = 0; number < TSchemaLimits::kMaxProperties; ++number) {
+        there->AddPropertyDecl(Decl({"P" + std::to_string(number), TType::kUint8, {}}));
+    }
+    const auto size = disk->FindPropertyDecl("Size");
+    EXPECT_EQ(31, StatusOf([&] { copier.CopyPropertyDecl(*size, *there); }));
+    EXPECT_EQ(31, StatusOf([&] { copier.CopyPropertyDecl(*size, *there->GetSuperInMemClass()); }));
+    const auto wide = Declare("Wide", disk);
+    wide->AddPropertyDecl(Decl({"More", TType::kUint8, {}}));
+    const auto below = ns->AllocateInMemClass("Below", wide);
+    below->AddToNamespace(none);
+    target->AllocateInMemClass("Wide", there)->AddToNamespace(none);
+    EXPECT_EQ(0, StatusOf([&] { copier.CopyClass(*below); }));
+    below->AddPropertyDecl(Decl({"Own", TType::kUint8, {}}));
+    EXPECT_EQ(31, StatusOf([&] { copier.CopyPropertyDecl(*below->FindPropertyDecl("Own"), *target->FindClass("Below")); }));
+    EXPECT_EQ(TSchemaLimits::kMaxProperties, target->FindClass("Below")->GetSlotOrder().size());
 }
 
 TEST_F(InMemSchemaCopierTest, AConflictOfTypesDeclaresNoClass)

@@ -155,7 +155,7 @@ TEST(ProviderManagerTest, ANullProviderIsRefused)
     EXPECT_EQ(TZELStatusCode::kInvalidParameter, TNamespaceProviderManager::GetInstance()->RegisterProvider(nullptr).GetStatus());
 }
 
-TEST(OSSpecificTest, TheRootIsTheEnvironmentsOrTheSourceTree)
+TEST(OSSpecificTest, TheRootIsTheEnvironmentsOrTheBuildTrees)
 {
     const char* const before = getenv("CIMDELTA_ROOT");
     const std::string kept = before != nullptr ? before : "";

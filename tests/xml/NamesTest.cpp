@@ -101,9 +101,9 @@ TEST(NamesTest, PathsWithinPathsEndSomewhere)
         }
         return path;
     };
-    const std::string refused = "found a path whose keys are paths within paths, more than can be told; flatten it";
-    EXPECT_EQ("", ErrorOfPath(nest("Other", 12)));
-    EXPECT_EQ(refused, ErrorOfPath(nest("Other", 13)));
+    const std::string refused = "found object paths within each other more than 12 deep, expected fewer";
+    EXPECT_EQ("", ErrorOfPath(nest("Other", 11)));
+    EXPECT_EQ(refused, ErrorOfPath(nest("Other", 12)));
     EXPECT_EQ(refused, ErrorOfPath(nest("E", 40)));  // whose key is text: each level would double it
 }
 

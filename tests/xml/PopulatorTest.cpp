@@ -267,6 +267,28 @@ TEST_F(PopulatorTest, AStaticValueIsAsItWasAfterAFailure)
     EXPECT_EQ("new", fLoading.ValueOf("A.Id=\"1\"", "V"));
 }
 
+TEST_F(PopulatorTest, ElementsAreThoseOfTheLastLoadThatDidNotFail)
+{
+    TCimXmlPopulator populator(fLoading.GetNamespace());
+    const auto load = [&populator](const std::string& text) { populator.LoadFromMemory(text.data(), text.size(), "doc.xml"); };
+    const auto take = [&populator] {
+        std::string names;
+        for (const boost::shared_ptr<ICIMElement>& element : populator.TakeElements()) {
+            const auto cls = boost::dynamic_pointer_cast<ICIMClass>(element);
+            names += (cls ? cls->GetName(TCallContext()) : "instance") + " ";
+        }
+        return names;
+    };
+    load(L::Group(L::Class("Unkept")));
+    EXPECT_EQ("", take());
+    populator.KeepElements();
+    load(L::Group(L::Class("One")));
+    load(L::Group(L::Instance("Two", "1") + L::Class("Two") + L::Class("Three")));
+    EXPECT_THROW(load(L::Group(L::Class("Four") + L::Instance("Nobody", "1"))), TPopulateError);
+    EXPECT_EQ("Two Three instance ", take());
+    EXPECT_EQ("", take());
+}
+
 TEST_F(PopulatorTest, TheDeltaSchemaLoadsWithGeneratedKeys)
 {
     const auto elements =

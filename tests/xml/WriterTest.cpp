@@ -105,6 +105,21 @@ TEST(CimXmlWriterTest, WhatTheSinkThrowsReachesTheCallerAndTheNextDocumentBegins
     }
 }
 
+TEST(CimXmlWriterTest, WhatTheSinkRefusedAtTheEndIsOfferedAgain)
+{
+    TNarrowSink sink(0);
+    TCimXmlWriter writer([&sink](std::string_view piece) { sink.Take(piece); });
+    writer.StartDocument();
+    EXPECT_THROW(writer.EndDocument(), std::runtime_error);
+    sink.Empty(0);
+    EXPECT_THROW(writer.EndDocument(), std::runtime_error);
+    sink.Empty(1);
+    writer.EndDocument();
+    EXPECT_EQ(TLoading().Write(), sink.GetText());
+    writer.EndDocument();
+    EXPECT_EQ(TLoading().Write(), sink.GetText());
+}
+
 TEST(CimXmlWriterTest, AnInstanceIsOneElement)
 {
     TLoading loading;

@@ -3,6 +3,8 @@
 
 #include "embedded/TInMemNamespace.h"
 #include "host/TNamespaceProviderManager.h"
+#include "host/TOSSpecific.h"
+#include "host/TZELException.h"
 #include "provider/TDeltaNamespace.h"
 
 using namespace NORVZEL20;
@@ -10,9 +12,16 @@ using namespace NORVZEL20;
 int main()
 {
     const auto provider = TNamespaceProviderManager::GetInstance()->FindProvider("delta");
-    const auto delta = boost::dynamic_pointer_cast<TDeltaNamespace>(provider->AllocateNamespace(TCallContext(), false, "delta"));
-    delta->AddNamespaceToCompareList(TInMemNamespace::Create("root/cimv2"));
-    delta->AddNamespaceToCompareList(TInMemNamespace::Create("root/cimv2"));
-    std::cout << provider->GetName(TCallContext()) << ": " << delta->NumContainers() << " containers\n";
+    const std::string place = ", data in " + TOSSpecific::GetZELRootPath() + "\n";
+    try {
+        const auto delta =
+            boost::dynamic_pointer_cast<TDeltaNamespace>(provider->AllocateNamespace(TCallContext(), false, "delta"));
+        delta->AddNamespaceToCompareList(TInMemNamespace::Create("root/cimv2"));
+        delta->AddNamespaceToCompareList(TInMemNamespace::Create("root/cimv2"));
+        std::cout << provider->GetName(TCallContext()) << ": " << delta->NumContainers() << " containers" << place;
+    } catch (const TZELException&) {
+        std::cout << "no delta namespace" << place;
+        return 1;
+    }
     return 0;
 }

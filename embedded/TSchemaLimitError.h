@@ -1,0 +1,22 @@
+#pragma once
+
+#include <string>
+
+#include "host/TZELException.h"
+
+namespace NORVZEL20 {
+
+/// A class would go beyond TSchemaLimits: status 31.
+class TSchemaLimitError : public TZELException {
+  public:
+    /// `text` says which limit, for people.
+    explicit TSchemaLimitError(const std::string& text);
+    ~TSchemaLimitError() noexcept override;
+
+    const char* what() const noexcept override { return fText.c_str(); }
+
+  private:
+    std::string fText;
+};
+
+}  // namespace NORVZEL20

@@ -1,0 +1,99 @@
+// Documents that would have the loader do the same again and again: its steps are counted.
+#include <gtest/gtest.h>
+
+#include "embedded/EraseLast.h"
+#include "embedded/TCimXmlLoader.h"
+#include "embedded/TXmlReader.h"
+
+namespace NORVZEL20 {
+
+namespace {
+
+struct TNoSink : TXmlReader::ISink {
+    void OnStart(const char*, const char**) override {}
+    void OnEnd(const char*) override {}
+    void OnText(const char*, std::size_t) override {}
+};
+
+/// A loader that is told classes and instances as a document would tell them.
+class LoaderWorkTest : public testing::Test {
+  protected:
+    LoaderWorkTest() { fContext.SetReader(fXml); }
+
+    void Class(const std::string& name, const std::string& super = std::string())
+    {
+        TCimXmlDraft draft{TEmbeddedObject(name, true), {}, {}, {}};
+        draft.object.SetSuperClassName(super);
+        fLoader.AddClass(std::move(draft));
+    }
+
+    /// Whether the class of an instance is known, so that it can be filled.
+    bool Instance(const std::string& className) { return fLoader.BeginInstance(className.c_str()); }
+
+    boost::shared_ptr<TInMemNamespace> fNamespace = TInMemNamespace::Create("root/cimv2");
+    TNoSink fSink;
+    TXmlReader fXml{fSink};
+    TCimXmlContext fContext{"hostile.xml"};
+    TCimXmlLoader fLoader{fContext, fNamespace};
+};
+
+std::string Name(std::size_t number)
+{
+    return "C" + std::to_string(number);
+}
+
+constexpr std::size_t kMany = 2000;
+
+}  // namespace
+
+TEST_F(LoaderWorkTest, ClassesBetweenInstancesAreTriedOnce)
+{
+    for (std::size_t number = 0; number < kMany; ++number) {
+        Class(Name(number));
+        EXPECT_TRUE(Instance(Name(number)));
+    }
+    fLoader.Finish();
+    EXPECT_LE(fLoader.CountTried(), 4 * kMany);
+}
+
+TEST_F(LoaderWorkTest, ClassesThatWaitForTheirSuperclassAreNotTriedAgainForEachInstance)
+{
+    for (std::size_t number = 0; number < kMany; ++number)
+        Class("Waiting" + Name(number), "Late");
+    for (std::size_t number = 0; number < kMany; ++number) {
+        Class(Name(number));
+        EXPECT_TRUE(Instance(Name(number)));
+    }
+    Class("Late");
+    EXPECT_TRUE(Instance("Waiting" + Name(7)));
+    fLoader.Finish();
+    EXPECT_LE(fLoader.CountTried(), 12 * kMany);
+    EXPECT_EQ(2 * kMany + 1, fNamespace->GetClasses().size());
+}
+
+TEST_F(LoaderWorkTest, ALongChainWithoutATopIsGoneOverOnce)
+{
+    for (std::size_t number = kMany; number > 0; --number)
+        Class(Name(number), Name(number - 1));
+    EXPECT_THROW(fLoader.Finish(), TPopulateError);
+    EXPECT_LE(fLoader.CountTried(), 4 * kMany);
+}
+
+/// So a failed load takes back what it added, last things first.
+TEST(EraseLastTest, TheLastElementIsFoundAtOnce)
+{
+    std::vector<int> list;
+    for (int number = 0; number < 100; ++number)
+        list.push_back(number);
+    std::size_t asked = 0;
+    for (int number = 99; number >= 10; --number)
+        EraseLast(list, [&](int other) { return ++asked > 0 && other == number; });
+    EXPECT_EQ(90U, asked);
+    EXPECT_EQ(10U, list.size());
+    EraseLast(list, [](int other) { return other % 2 == 0; });
+    EXPECT_EQ((std::vector<int>{0, 1, 2, 3, 4, 5, 6, 7, 9}), list);
+    EraseLast(list, [](int) { return false; });
+    EXPECT_EQ(9U, list.size());
+}
+
+}  // namespace NORVZEL20
