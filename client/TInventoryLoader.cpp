@@ -23,6 +23,7 @@ void LoadInto(TInventory& inventory)
         inventory.loaded =
             populator.LoadFromSource([&file](char* buffer, std::size_t size) { return file.Read(buffer, size); }, file.GetName());
     } catch (const TPopulateError& error) {
+        file.CheckRest();
         throw TClientError(error.what());
     } catch (const TZELException& error) {
         throw TClientError(file.GetName() + ": " + error.what());

@@ -85,25 +85,6 @@ TEST_F(BadInputTest, OfSeveralBadInventoriesTheFirstIsTold)
     }
 }
 
-TEST_F(BadInputTest, CompressedFilesThatEndEarlyAreTold)
-{
-    for (const char* suffix : {".gz", ".xz", ".zst"}) {
-        const std::string whole = ReadFile(std::string("web02.xml") + suffix);
-        const std::string half = Scratch(std::string("half") + suffix, whole.substr(0, whole.size() / 2));
-        const std::string message = Shorten(Complaint({"show", half}), half, "H");
-        EXPECT_EQ(0u, message.find("cimdelta: H: cannot be read: ")) << message;
-        EXPECT_NE(std::string::npos, message.find("; is the file whole?")) << message;
-    }
-}
-
-TEST_F(BadInputTest, ALargeCompressedFileThatEndsEarlyIsTold)
-{
-    const std::string whole = ReadFile(CIMDELTA_PAIR_DATA "/a.xml.xz");
-    const std::string half = Scratch("half.xz", whole.substr(0, whole.size() / 2));
-    EXPECT_EQ("cimdelta: H: cannot be read: truncated xz input; is the file whole? (plain, gzip, xz and zstd are understood)\n",
-              Shorten(Complaint({"compare", "web01.xml", half}), half, "H"));
-}
-
 TEST_F(BadInputTest, InventoriesThatAreNoInventoriesAreToldWithTheirPlace)
 {
     const struct {
