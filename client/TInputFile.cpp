@@ -5,10 +5,10 @@
 #include <sys/stat.h>
 #include <unistd.h>
 
-#include <algorithm>
 #include <cerrno>
 #include <cstring>
 
+#include "client/StandardDescriptors.h"
 #include "client/TClientError.h"
 
 namespace NORVZEL20 {
@@ -78,7 +78,7 @@ std::size_t TInputFile::ReadDescriptor(char* buffer, std::size_t size)
         if (errno == EAGAIN) {
             pollfd wait = {fDescriptor, POLLIN, 0};
             poll(&wait, 1, -1);
-        } else if (errno == EBADF) {
+        } else if (errno == EBADF && IsClosed(fDescriptor)) {
             throw TClientError(fName + ": cannot be read: it is closed");
         } else if (errno != EINTR) {
             throw TClientError(fName + ": cannot be read: " + std::strerror(errno));

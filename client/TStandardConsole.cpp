@@ -6,6 +6,7 @@
 #include <cstdlib>
 #include <cstring>
 
+#include "client/StandardDescriptors.h"
 #include "client/TClientError.h"
 #include "client/WholeWrite.h"
 
@@ -36,7 +37,7 @@ TStandardConsole::TStandardConsole()
 void TStandardConsole::WriteResult(const std::string& text)
 {
     const int error = WriteWhole(STDOUT_FILENO, text);
-    if (error == EPIPE) {
+    if (error == EPIPE || (error == EBADF && IsClosed(STDOUT_FILENO))) {
         throw TClientError("");
     }
     if (error != 0) {
@@ -44,22 +45,33 @@ void TStandardConsole::WriteResult(const std::string& text)
     }
 }
 
-void TStandardConsole::Say(const std::string& line) noexcept
+void TStandardConsole::Say(std::string_view line) noexcept
 {
     const std::lock_guard<std::mutex> lock(fMutex);
     if (fProgressShown) {
         WriteWhole(STDERR_FILENO, kWipeLine);
         fProgressShown = false;
     }
-    WriteWhole(STDERR_FILENO, line + "\n");
+    WriteAtOnce(line, "\n");
 }
 
-void TStandardConsole::ShowProgress(const std::string& text) noexcept
+void TStandardConsole::ShowProgress(std::string_view text) noexcept
 {
     const std::lock_guard<std::mutex> lock(fMutex);
     if (fProgress && (fProgressShown || !text.empty())) {
-        WriteWhole(STDERR_FILENO, kWipeLine + text);
+        WriteAtOnce(kWipeLine, text);
         fProgressShown = !text.empty();
+    }
+}
+
+// In one piece, so that no other process writes in between; without memory for that, in two.
+void TStandardConsole::WriteAtOnce(std::string_view first, std::string_view second) noexcept
+{
+    try {
+        WriteWhole(STDERR_FILENO, std::string(first).append(second));
+    } catch (const std::exception&) {
+        WriteWhole(STDERR_FILENO, first);
+        WriteWhole(STDERR_FILENO, second);
     }
 }
 
