@@ -16,6 +16,7 @@ namespace NORVZEL20 {
 namespace {
 
 const int kTrouble = 2;
+const char kNoMemory[] = "cimdelta: not enough memory";
 
 const char kInventoryHelp[] = "CIM-XML, plain or compressed with gzip, xz or zstd; - is standard input";
 
@@ -156,16 +157,30 @@ class TCommandLine {
 
 }  // namespace
 
+namespace {
+
+// A text that there is no memory to put together gives way to the reason.
+void Complain(IConsole& console, const char* text) noexcept
+{
+    try {
+        console.Say(std::string("cimdelta: ") + text);
+    } catch (const std::exception&) {
+        console.Say(kNoMemory);
+    }
+}
+
+}  // namespace
+
 int RunClient(int argc, const char* const* argv, IConsole& console) noexcept
 {
     try {
         return TCommandLine().Run(argc, argv, console);
     } catch (const std::bad_alloc&) {
-        console.Say("cimdelta: not enough memory");
+        console.Say(kNoMemory);
     } catch (const std::exception& error) {
         // An empty text: whoever read the result went away, and nobody needs to be told.
         if (*error.what() != '\0') {
-            console.Say(std::string("cimdelta: ") + error.what());
+            Complain(console, error.what());
         }
     }
     return kTrouble;
