@@ -8,6 +8,7 @@
 #include "client/CheckCommand.h"
 #include "client/CompareCommand.h"
 #include "client/ExplainCommand.h"
+#include "client/LackOfMemory.h"
 #include "client/QueryCommand.h"
 #include "client/ShowCommand.h"
 
@@ -16,7 +17,6 @@ namespace NORVZEL20 {
 namespace {
 
 const int kTrouble = 2;
-const char kNoMemory[] = "cimdelta: not enough memory";
 
 const char kInventoryHelp[] = "CIM-XML, plain or compressed with gzip, xz or zstd; - is standard input";
 

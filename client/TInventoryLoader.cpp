@@ -6,6 +6,7 @@
 #include <thread>
 
 #include "client/InventoryLabels.h"
+#include "client/LackOfMemory.h"
 #include "client/TClientError.h"
 #include "client/TInventoryFile.h"
 #include "client/TProgress.h"
@@ -31,6 +32,7 @@ void LoadInto(TInventory& inventory)
         file.CheckRest();
         throw TClientError(error.what());
     } catch (const TZELException& error) {
+        ThrowIfOutOfMemory(error);
         throw TClientError(file.GetName() + ": " + error.what());
     }
 }

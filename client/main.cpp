@@ -2,6 +2,7 @@
 
 #include "client/CommandLine.h"
 #include "client/EndingSignals.h"
+#include "client/LackOfMemory.h"
 #include "client/StandardDescriptors.h"
 #include "client/TStandardConsole.h"
 
@@ -12,6 +13,7 @@ int main(int argc, char** argv)
     std::signal(SIGXFSZ, SIG_IGN);
     NORVZEL20::ReserveStandardDescriptors();
     NORVZEL20::RemoveUnfinishedFilesOnSignals();
+    NORVZEL20::EndInOrderWithoutMemory();
     NORVZEL20::TStandardConsole console;
     return NORVZEL20::RunClient(argc, argv, console);
 }
