@@ -16,8 +16,8 @@ class IConsole {
     /// reader has closed the pipe or standard output is closed.
     virtual void WriteResult(const std::string& text) = 0;
 
-    /// Writes one line, without its end, to standard error. Never throws, not even
-    /// where there is no memory.
+    /// Writes one line, without its end, to standard error, with escapes in place of what could move a terminal. Never throws, not
+    /// even where there is no memory.
     virtual void Say(std::string_view line) noexcept = 0;
 
     /// Whether results are to be coloured: standard output is a terminal and NO_COLOR is not set.

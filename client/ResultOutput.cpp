@@ -101,25 +101,34 @@ void WriteSpecial(const std::string& path, const std::string& text)
     CheckWritten(path, error != 0 ? error : closing);
 }
 
-// The rights of the file that is replaced, else those that a file made in the ordinary way would have; a temporary one has fewer.
-mode_t ModeFor(const std::string& path)
+// Gives the file the owner and the rights of the one that it replaces, else the rights that a file made in the ordinary way would
+// have; a temporary one has fewer. Returns 0 or errno.
+int SetRights(int descriptor, const std::string& target)
 {
     struct stat status;
-    if (stat(path.c_str(), &status) == 0) {
-        return status.st_mode & 0777;
+    mode_t mode = 0;
+    if (stat(target.c_str(), &status) == 0) {
+        // Only root may give a file away; anybody else who replaces another one's file owns the new one.
+        static_cast<void>(fchown(descriptor, status.st_uid, status.st_gid) == 0);
+        mode = status.st_mode & 0777;
+    } else {
+        const mode_t mask = umask(0);
+        umask(mask);
+        mode = 0666 & ~mask;
     }
-    const mode_t mask = umask(0);
-    umask(mask);
-    return 0666 & ~mask;
+    return fchmod(descriptor, mode) != 0 ? errno : 0;
 }
 
-int WriteAndSync(TUnfinishedFile& file, const std::string& text, mode_t mode)
+int WriteAndSync(TUnfinishedFile& file, const std::string& text, const std::string& target)
 {
-    const int error = WriteWhole(file.GetDescriptor(), text);
+    int error = WriteWhole(file.GetDescriptor(), text);
+    if (error == 0) {
+        error = SetRights(file.GetDescriptor(), target);
+    }
     if (error != 0) {
         return error;
     }
-    if (fchmod(file.GetDescriptor(), mode) != 0 || fsync(file.GetDescriptor()) != 0) {
+    if (fsync(file.GetDescriptor()) != 0) {
         return errno;
     }
     return file.Close();
@@ -131,7 +140,7 @@ void WriteFile(const std::string& path, const std::string& target, const std::st
     TUnfinishedFile file(FolderOf(target) + ".cimdelta-");
     int error = file.GetError();
     if (error == 0) {
-        error = WriteAndSync(file, text, ModeFor(target));
+        error = WriteAndSync(file, text, target);
     }
     if (error == 0) {
         error = file.MoveTo(target);
@@ -143,9 +152,14 @@ void WriteFile(const std::string& path, const std::string& target, const std::st
 
 }  // namespace
 
+bool IsStandardOutput(const std::string& path)
+{
+    return path.empty() || path == "-";
+}
+
 void DeliverResult(IConsole& console, const std::string& path, const std::string& text)
 {
-    if (path.empty()) {
+    if (IsStandardOutput(path)) {
         console.WriteResult(text);
         return;
     }

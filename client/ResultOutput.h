@@ -6,7 +6,10 @@
 
 namespace NORVZEL20 {
 
-/// Brings a whole result to where the person wants it: the named file, or standard output where `path` is empty.
+/// Whether results for that path go to standard output: it is empty or "-".
+bool IsStandardOutput(const std::string& path);
+
+/// Brings a whole result to where the person wants it: the named file, or standard output where IsStandardOutput(path).
 ///
 /// The file appears whole or not at all: the text is written beside it, then renamed; what was there before stays until then. Links
 /// are followed and stay. A device, a pipe or an open descriptor (/dev/stdout) is written to, not replaced.

@@ -6,6 +6,7 @@
 #include <cstdlib>
 #include <cstring>
 
+#include "client/DisplayText.h"
 #include "client/StandardDescriptors.h"
 #include "client/TClientError.h"
 #include "client/WholeWrite.h"
@@ -26,6 +27,16 @@ bool IsSet(const char* variable)
 {
     const char* value = std::getenv(variable);
     return value != nullptr && *value != '\0';
+}
+
+// Without memory: what could move a terminal is not told.
+void SayPlainly(std::string_view line) noexcept
+{
+    for (const char character : line) {
+        const bool isPlain = character >= ' ' && character <= '~';
+        WriteWhole(STDERR_FILENO, std::string_view(isPlain ? &character : "?", 1));
+    }
+    WriteWhole(STDERR_FILENO, "\n");
 }
 
 }  // namespace
@@ -52,26 +63,20 @@ void TStandardConsole::Say(std::string_view line) noexcept
         WriteWhole(STDERR_FILENO, kWipeLine);
         fProgressShown = false;
     }
-    WriteAtOnce(line, "\n");
+    try {
+        WriteWhole(STDERR_FILENO, EscapeForDisplay(line) + "\n");
+    } catch (const std::exception&) {
+        SayPlainly(line);
+    }
 }
 
 void TStandardConsole::ShowProgress(std::string_view text) noexcept
 {
     const std::lock_guard<std::mutex> lock(fMutex);
     if (fProgress && (fProgressShown || !text.empty())) {
-        WriteAtOnce(kWipeLine, text);
+        WriteWhole(STDERR_FILENO, kWipeLine);
+        WriteWhole(STDERR_FILENO, text);
         fProgressShown = !text.empty();
-    }
-}
-
-// In one piece, so that no other process writes in between; without memory for that, in two.
-void TStandardConsole::WriteAtOnce(std::string_view first, std::string_view second) noexcept
-{
-    try {
-        WriteWhole(STDERR_FILENO, std::string(first).append(second));
-    } catch (const std::exception&) {
-        WriteWhole(STDERR_FILENO, first);
-        WriteWhole(STDERR_FILENO, second);
     }
 }
 

@@ -17,8 +17,6 @@ class TStandardConsole : public IConsole {
     void ShowProgress(std::string_view text) noexcept override;
 
   private:
-    void WriteAtOnce(std::string_view first, std::string_view second) noexcept;
-
     std::mutex fMutex;
     bool fColored;
     bool fProgress;

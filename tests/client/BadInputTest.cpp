@@ -109,6 +109,43 @@ TEST_F(BadInputTest, InventoriesThatAreNoInventoriesAreToldWithTheirPlace)
     }
 }
 
+TEST_F(BadInputTest, AnEmptyArgumentIsNoArgument)
+{
+    EXPECT_EQ("cimdelta: --spec: must not be empty; see cimdelta compare --help\n",
+              Complaint({"compare", "--spec", "", "web01.xml", "web02.xml"}));
+    EXPECT_EQ("cimdelta: OTHER: must not be empty; see cimdelta compare --help\n",
+              Complaint({"compare", "web01.xml", "web02.xml", ""}));
+    EXPECT_EQ("cimdelta: --output: must not be empty; see cimdelta show --help\n",
+              Complaint({"show", "web01.xml", "--output", ""}));
+    EXPECT_EQ("cimdelta: INVENTORY: must not be empty; see cimdelta show --help\n", Complaint({"show", ""}));
+    EXPECT_EQ("cimdelta: --schema: must not be empty; see cimdelta check --help\n",
+              Complaint({"check", "rules.xml", "--schema", ""}));
+}
+
+TEST_F(BadInputTest, BracketsAreNoList)
+{
+    EXPECT_EQ("cimdelta: [a,b]: cannot be opened: No such file or directory\n", Complaint({"compare", "web01.xml", "[a,b]"}));
+    EXPECT_EQ("cimdelta: [a]: cannot be opened: No such file or directory\n", Complaint({"show", "[a]"}));
+    EXPECT_EQ("cimdelta: --format: [json] not in {text,json,ndjson,cimxml}; see cimdelta show --help\n",
+              Complaint({"show", "web01.xml", "-o", "[json]"}));
+    EXPECT_EQ("cimdelta: The following argument was not expected: [c]; see cimdelta show --help\n",
+              Complaint({"show", "web01.xml", "b", "[c]"}));
+}
+
+TEST_F(BadInputTest, ALongKeyMakesNoLongMessage)
+{
+    const std::string instance = "<VALUE.OBJECT><INSTANCE CLASSNAME='A'><PROPERTY NAME='Id' TYPE='string'><VALUE>" +
+                                 std::string(1000000, 'k') + "</VALUE></PROPERTY></INSTANCE></VALUE.OBJECT>";
+    const std::string inventory =
+        Scratch("long", "<CIM CIMVERSION='2.0' DTDVERSION='2.0'><DECLARATION><DECLGROUP><VALUE.OBJECT><CLASS NAME='A'>"
+                        "<PROPERTY NAME='Id' TYPE='string'><QUALIFIER NAME='Key' TYPE='boolean'><VALUE>true</VALUE></QUALIFIER>"
+                        "</PROPERTY></CLASS></VALUE.OBJECT>\n" +
+                            instance + "\n" + instance + "</DECLGROUP></DECLARATION></CIM>");
+    EXPECT_EQ("cimdelta: I:3:1000099: found a second instance \"root/cimv2:A.Id=\"" + std::string(63, 'k') +
+                  "...\"; instances of class \"A\" must differ in their keys\n",
+              Shorten(Complaint({"show", inventory}), inventory, "I"));
+}
+
 TEST_F(BadInputTest, WrongUsageIsToldInOneLine)
 {
     EXPECT_EQ("cimdelta: name a command: compare, check, explain, query or show; see cimdelta --help\n", Complaint({}));

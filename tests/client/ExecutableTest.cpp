@@ -1,3 +1,5 @@
+#include <sys/stat.h>
+
 #include <cstdlib>
 
 #include "tests/client/ProgramTest.h"
@@ -22,6 +24,18 @@ TEST_F(ExecutableTest, TroubleGoesToStandardErrorAlone)
     EXPECT_EQ("[2]\n--\ncimdelta: name a command: compare, check, explain, query or show; see cimdelta --help\n", Shell("frob"));
 }
 
+TEST_F(ExecutableTest, MessagesMoveNoTerminal)
+{
+    EXPECT_EQ("[2]\n--\ncimdelta: \\x1b[31m\\u202e\\u009b\\u061c\\x7f\\n.xml: cannot be opened: No such file or directory\n",
+              Shell("show '\x1b[31m\u202e\u009b\u061c\x7f\n.xml'"));
+    const std::string undeclared =
+        Scratch("term", "<CIM CIMVERSION='2.0' DTDVERSION='2.0'><DECLARATION><DECLGROUP><VALUE.OBJECT>"
+                        "<INSTANCE CLASSNAME='\u009b2J\u202e'/></VALUE.OBJECT></DECLGROUP></DECLARATION></CIM>");
+    EXPECT_NE(std::string::npos,
+              Shell("show " + undeclared).find("found an instance of class \"\\u009b2J\\u202e\", which is not declared"))
+        << Shell("show " + undeclared);
+}
+
 TEST_F(ExecutableTest, TheStatusTellsWhetherSomethingDiffers)
 {
     EXPECT_EQ("[0]", Shell("compare web01.xml web01-again.xml").substr(0, 3));
@@ -40,6 +54,30 @@ TEST_F(ExecutableTest, AnOutputFileAppearsWhole)
     const std::string file = Scratch("report", "what was there before");
     EXPECT_EQ("[1]\n--\n", Shell("compare --output " + file + " web01.xml web02.xml"));
     EXPECT_EQ(report, "[1]\n" + ReadFile(file) + "--\n");
+}
+
+TEST_F(ExecutableTest, AnOutputFileOfThatNameIsStandardOutput)
+{
+    EXPECT_EQ(kPackages, Shell("show web01.xml INV_Disk --output -"));
+    EXPECT_NE(0, access("-", F_OK));
+}
+
+TEST_F(ExecutableTest, AnOutputFileKeepsOwnerAndRights)
+{
+    const std::string file = Scratch("report", "what was there before");
+    ASSERT_EQ(0, chmod(file.c_str(), 0640));
+    if (geteuid() == 0) {
+        ASSERT_EQ(0, chown(file.c_str(), 1, 2));
+    }
+    struct stat before = {};
+    struct stat after = {};
+    ASSERT_EQ(0, stat(file.c_str(), &before));
+    EXPECT_EQ("[0]\n--\n", Shell("show web01.xml INV_Disk --output " + file));
+    ASSERT_EQ(0, stat(file.c_str(), &after));
+    EXPECT_NE(before.st_ino, after.st_ino);
+    EXPECT_EQ(before.st_mode, after.st_mode);
+    EXPECT_EQ(before.st_uid, after.st_uid);
+    EXPECT_EQ(before.st_gid, after.st_gid);
 }
 
 TEST_F(ExecutableTest, AnOutputFileStaysWhereTroubleComesUp)
