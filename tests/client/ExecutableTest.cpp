@@ -46,6 +46,9 @@ TEST_F(ExecutableTest, StandardInputIsAnInventoryToo)
 {
     EXPECT_EQ(kPackages, Shell("show - INV_Disk < web01.xml"));
     EXPECT_EQ("[1]\n8 differences between web01 and stdin: ", Shell("compare web01.xml - < web02.xml.gz").substr(0, 43));
+    EXPECT_EQ(
+        "[2]\n--\ncimdelta: standard input: cannot be read: the gzip data is damaged (it ends early); fetch or make it anew\n",
+        Shell("compare web01.xml -", "head -c 700 web02.xml.gz | "));
 }
 
 TEST_F(ExecutableTest, AnOutputFileAppearsWhole)
