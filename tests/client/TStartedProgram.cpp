@@ -52,8 +52,10 @@ TStartedProgram::TStartedProgram(const std::vector<std::string>& arguments, cons
     for (const auto& descriptor : descriptors) {
         posix_spawn_file_actions_adddup2(&actions, descriptor.second, descriptor.first);
     }
-    TSignals signals(ignored);
-    EXPECT_EQ(0, posix_spawn(&fProcess, program.c_str(), &actions, signals.Get(), argv.data(), environ));
+    const TSignals signals(ignored);
+    const int error = posix_spawn(&fProcess, program.c_str(), &actions, signals.Get(), argv.data(), environ);
+    EXPECT_EQ(0, error);
+    fEnded = error != 0;
     posix_spawn_file_actions_destroy(&actions);
 }
 

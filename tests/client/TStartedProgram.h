@@ -30,7 +30,7 @@ class TStartedProgram {
     std::string Wait();
 
   private:
-    pid_t fProcess;
+    pid_t fProcess = 0;
     bool fEnded = false;
     int fStatus = 0;
 };
