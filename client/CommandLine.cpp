@@ -1,6 +1,7 @@
 #include "client/CommandLine.h"
 
 #include <CLI/CLI.hpp>
+#include <algorithm>
 #include <exception>
 #include <functional>
 #include <sstream>
@@ -8,6 +9,7 @@
 #include "client/CheckCommand.h"
 #include "client/CompareCommand.h"
 #include "client/ExplainCommand.h"
+#include "client/LackOfMemory.h"
 #include "client/QueryCommand.h"
 #include "client/ShowCommand.h"
 
@@ -18,6 +20,25 @@ namespace {
 const int kTrouble = 2;
 
 const char kInventoryHelp[] = "CIM-XML, plain or compressed with gzip, xz or zstd; - is standard input";
+
+// Put in front of arguments in brackets, which would be taken for a list and split, until they have got where they belong.
+const char kGuard = '\x01';
+
+std::string Guard(const std::string& argument)
+{
+    return argument.size() > 1 && argument.front() == '[' && argument.back() == ']' ? kGuard + argument : argument;
+}
+
+std::string Unguard(std::string text)
+{
+    text.erase(std::remove(text.begin(), text.end(), kGuard), text.end());
+    return text;
+}
+
+std::string RefuseEmpty(const std::string& text)
+{
+    return text.empty() ? "must not be empty" : "";
+}
 
 // The arguments of every command and which one was asked for.
 class TCommandLine {
@@ -37,8 +58,12 @@ class TCommandLine {
 
     int Run(int argc, const char* const* argv, IConsole& console)
     {
+        std::vector<std::string> guarded;
+        for (int i = argc - 1; i > 0; --i) {
+            guarded.push_back(Guard(argv[i]));
+        }
         try {
-            fApp.parse(argc, argv);
+            fApp.parse(std::move(guarded));  // the last one first
         } catch (const CLI::ParseError& error) {
             return Answer(error, console);
         }
@@ -59,7 +84,7 @@ class TCommandLine {
         if (chosen.empty()) {
             console.Say("cimdelta: name a command: compare, check, explain, query or show; see cimdelta --help");
         } else {
-            console.Say("cimdelta: " + std::string(error.what()) + "; see cimdelta " + chosen[0]->get_name() + " --help");
+            console.Say("cimdelta: " + Unguard(error.what()) + "; see cimdelta " + chosen[0]->get_name() + " --help");
         }
         return kTrouble;
     }
@@ -71,22 +96,27 @@ class TCommandLine {
         return command;
     }
 
+    template <class TTarget>
+    static CLI::Option* AddText(CLI::App* command, const char* name, TTarget& target, const char* description)
+    {
+        return command->add_option(name, target, description)->transform(&Unguard)->check(&RefuseEmpty);
+    }
+
     static void AddFormat(CLI::App* command, std::string& format)
     {
-        command->add_option("-o,--format", format, "text, json, ndjson or cimxml (text)")
+        AddText(command, "-o,--format", format, "text, json, ndjson or cimxml (text)")
             ->check(CLI::IsMember({"text", "json", "ndjson", "cimxml"}))
             ->option_text("FORMAT");
     }
 
     static void AddOutput(CLI::App* command, std::string& output)
     {
-        command->add_option("--output", output, "write the result to this file, whole or not at all")->option_text("FILE");
+        AddText(command, "--output", output, "write the result to this file, whole or not at all")->option_text("FILE");
     }
 
     static void AddSchemas(CLI::App* command, std::vector<std::string>& schemas)
     {
-        command
-            ->add_option("--schema", schemas, "an inventory to be compared under the rules; repeated for each, the reference first")
+        AddText(command, "--schema", schemas, "an inventory to be compared under the rules; repeated for each, the reference first")
             ->required()
             ->allow_extra_args(false)
             ->option_text("INVENTORY");
@@ -96,9 +126,9 @@ class TCommandLine {
     {
         CLI::App* command = AddCommand("compare", "what differs between a reference and other inventories",
                                        [this](IConsole& console) { return RunCompare(fCompare, console); });
-        command->add_option("REFERENCE", fCompare.reference, kInventoryHelp)->required()->option_text(" ");
-        command->add_option("OTHER", fCompare.others, "compared with the reference, each")->required()->option_text("...");
-        command->add_option("--spec", fCompare.rules, "the rules: what to compare (everything)")->option_text("RULES");
+        AddText(command, "REFERENCE", fCompare.reference, kInventoryHelp)->required()->option_text(" ");
+        AddText(command, "OTHER", fCompare.others, "compared with the reference, each")->required()->option_text("...");
+        AddText(command, "--spec", fCompare.rules, "the rules: what to compare (everything)")->option_text("RULES");
         AddFormat(command, fCompare.format);
         AddOutput(command, fCompare.output);
         command->add_flag("--strict-schema", fCompare.strictSchema, "declare nothing in inventories that lack what others declare");
@@ -108,7 +138,7 @@ class TCommandLine {
     {
         CLI::App* command = AddCommand("check", "what a rules file says and does, and what is odd about it",
                                        [this](IConsole& console) { return RunCheck(fCheck, console); });
-        command->add_option("RULES", fCheck.rules, "the rules file")->required()->option_text(" ");
+        AddText(command, "RULES", fCheck.rules, "the rules file")->required()->option_text(" ");
         AddSchemas(command, fCheck.schemas);
         AddOutput(command, fCheck.output);
     }
@@ -117,8 +147,8 @@ class TCommandLine {
     {
         CLI::App* command = AddCommand("explain", "which rule decides how a class or a property is compared",
                                        [this](IConsole& console) { return RunExplain(fExplain, console); });
-        command->add_option("ELEMENT", fExplain.element, "CLASS or CLASS.PROPERTY")->required()->option_text(" ");
-        command->add_option("--spec", fExplain.rules, "the rules file")->required()->option_text("RULES");
+        AddText(command, "ELEMENT", fExplain.element, "CLASS or CLASS.PROPERTY")->required()->option_text(" ");
+        AddText(command, "--spec", fExplain.rules, "the rules file")->required()->option_text("RULES");
         AddSchemas(command, fExplain.schemas);
         AddOutput(command, fExplain.output);
     }
@@ -127,10 +157,8 @@ class TCommandLine {
     {
         CLI::App* command = AddCommand("query", "the instances of an inventory that answer a query",
                                        [this](IConsole& console) { return RunQuery(fQuery, console); });
-        command->add_option("QUERY", fQuery.query, "WQL: SELECT * | name, ... FROM class [WHERE ...]")
-            ->required()
-            ->option_text(" ");
-        command->add_option("INVENTORY", fQuery.inventory, kInventoryHelp)->required()->option_text(" ");
+        AddText(command, "QUERY", fQuery.query, "WQL: SELECT * | name, ... FROM class [WHERE ...]")->required()->option_text(" ");
+        AddText(command, "INVENTORY", fQuery.inventory, kInventoryHelp)->required()->option_text(" ");
         AddFormat(command, fQuery.format);
         AddOutput(command, fQuery.output);
     }
@@ -139,8 +167,8 @@ class TCommandLine {
     {
         CLI::App* command = AddCommand("show", "the classes of an inventory, or the instances of a class",
                                        [this](IConsole& console) { return RunShow(fShow, console); });
-        command->add_option("INVENTORY", fShow.inventory, kInventoryHelp)->required()->option_text(" ");
-        command->add_option("CLASS", fShow.className, "its instances, and those of the classes below it")->option_text(" ");
+        AddText(command, "INVENTORY", fShow.inventory, kInventoryHelp)->required()->option_text(" ");
+        AddText(command, "CLASS", fShow.className, "its instances, and those of the classes below it")->option_text(" ");
         AddFormat(command, fShow.format);
         AddOutput(command, fShow.output);
     }
@@ -156,16 +184,30 @@ class TCommandLine {
 
 }  // namespace
 
+namespace {
+
+// A text that there is no memory to put together gives way to the reason.
+void Complain(IConsole& console, const char* text) noexcept
+{
+    try {
+        console.Say(std::string("cimdelta: ") + text);
+    } catch (const std::exception&) {
+        console.Say(kNoMemory);
+    }
+}
+
+}  // namespace
+
 int RunClient(int argc, const char* const* argv, IConsole& console) noexcept
 {
     try {
         return TCommandLine().Run(argc, argv, console);
     } catch (const std::bad_alloc&) {
-        console.Say("cimdelta: not enough memory");
+        console.Say(kNoMemory);
     } catch (const std::exception& error) {
         // An empty text: whoever read the result went away, and nobody needs to be told.
         if (*error.what() != '\0') {
-            console.Say(std::string("cimdelta: ") + error.what());
+            Complain(console, error.what());
         }
     }
     return kTrouble;

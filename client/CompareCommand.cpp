@@ -30,7 +30,7 @@ int RunCompare(const TCompareOptions& options, IConsole& console)
     paths.insert(paths.end(), options.others.begin(), options.others.end());
     std::vector<TInventory> inventories = TInventoryLoader(console).Load(paths);
     const TComparisonReport report = TComparison(inventories, console).Run(options.rules, options.strictSchema);
-    DeliverResult(console, options.output, Write(report, options.format, console.IsColored() && options.output.empty()));
+    DeliverResult(console, options.output, Write(report, options.format, console.IsColored() && IsStandardOutput(options.output)));
     return report.differences.empty() ? 0 : 1;
 }
 

@@ -1,6 +1,7 @@
 #pragma once
 
 #include <string>
+#include <string_view>
 
 namespace NORVZEL20 {
 
@@ -12,18 +13,19 @@ class IConsole {
     virtual ~IConsole() = default;
 
     /// Writes a whole result to standard output. Errors: TClientError where it does not get there, with an empty text where the
-    /// reader has closed the pipe.
+    /// reader has closed the pipe or standard output is closed.
     virtual void WriteResult(const std::string& text) = 0;
 
-    /// Writes one line, without its end, to standard error. Never throws.
-    virtual void Say(const std::string& line) noexcept = 0;
+    /// Writes one line, without its end, to standard error, with escapes in place of what could move a terminal. Never throws, not
+    /// even where there is no memory.
+    virtual void Say(std::string_view line) noexcept = 0;
 
     /// Whether results are to be coloured: standard output is a terminal and NO_COLOR is not set.
     virtual bool IsColored() const = 0;
 
     /// Standard error, for a line that is overwritten: shown only where it is a terminal. An empty text wipes it away. Never
     /// throws.
-    virtual void ShowProgress(const std::string& text) noexcept = 0;
+    virtual void ShowProgress(std::string_view text) noexcept = 0;
 };
 
 }  // namespace NORVZEL20

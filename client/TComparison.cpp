@@ -3,6 +3,7 @@
 #include <algorithm>
 
 #include "client/CompleteInventories.h"
+#include "client/LackOfMemory.h"
 #include "client/MadeRules.h"
 #include "client/StaticValues.h"
 #include "client/TClientError.h"
@@ -38,6 +39,7 @@ boost::shared_ptr<TDeltaNamespace> MakeDeltaNamespace()
         const boost::shared_ptr<ICIMNamespace> ns = provider->AllocateNamespace(TCallContext(), false, std::string());
         return boost::dynamic_pointer_cast<TDeltaNamespace>(ns);
     } catch (const TZELException& error) {
+        ThrowIfOutOfMemory(error);
         throw TClientError(log.GetMessages().empty() ? std::string("the delta schema cannot be loaded: ") + error.what()
                                                      : log.GetMessages().front());
     }
@@ -116,6 +118,7 @@ void TComparison::FindDifferences(TDeltaNamespace& records, TRules& rules)
     try {
         records.FindDifferences();
     } catch (const TZELException& error) {
+        ThrowIfOutOfMemory(error);
         throw TClientError(
             TComparisonFault{error.GetStatusCode(), error.what(), log.GetMessages(), fStrictSchema}.Describe(fInventories, rules));
     } catch (const TAssertionFailure& error) {

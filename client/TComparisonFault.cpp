@@ -3,6 +3,7 @@
 #include "client/CimWalk.h"
 #include "client/OperatingSystem.h"
 #include "client/TypeName.h"
+#include "host/TZELException.h"
 
 namespace NORVZEL20 {
 
@@ -13,6 +14,18 @@ std::string Name(const ICIMClass& cls)
     return cls.GetName(TCallContext());
 }
 
+// Whether the first instance has what the plug-in reads of it.
+bool HasUsableType(TInMemClass& systems)
+{
+    try {
+        const unsigned short type = InstancesOf(systems).at(0)->GetProperty("OSType", TCallContext())->GetValue(TCallContext());
+        static_cast<void>(type);
+        return true;
+    } catch (const TZELException&) {
+        return false;
+    }
+}
+
 // The reason of status 3: the first inventory that does not hold what the plug-in asks every inventory for.
 std::string FindSystemTrouble(const std::vector<TInventory>& inventories)
 {
@@ -21,8 +34,12 @@ std::string FindSystemTrouble(const std::vector<TInventory>& inventories)
             return inventory.path + " declares no class " + kOperatingSystemClass;
         }
     }
-    if (inventories[0].ns->FindClass(kOperatingSystemClass)->GetInstanceCount() == 0) {
+    const boost::shared_ptr<TInMemClass> systems = inventories[0].ns->FindClass(kOperatingSystemClass);
+    if (systems->GetInstanceCount() == 0) {
         return inventories[0].path + " has no instance of " + kOperatingSystemClass;
+    }
+    if (HasUsableType(*systems)) {
+        return "the inventories are as they should be; perhaps there was not enough memory";
     }
     return "the first " + std::string(kOperatingSystemClass) + " of " + inventories[0].path + " has no OSType between 0 and 65535";
 }

@@ -1,102 +1,76 @@
 #include "client/TInventoryFile.h"
 
-#include <archive.h>
-#include <archive_entry.h>
-#include <fcntl.h>
-#include <sys/stat.h>
-#include <unistd.h>
+#include <vector>
 
-#include <cerrno>
-#include <cstring>
-
+#include "client/TArchiveReader.h"
 #include "client/TClientError.h"
+#include "client/TGzipReader.h"
 
 namespace NORVZEL20 {
 
 namespace {
 
-const std::size_t kBlockSize = 256 * 1024;
+const std::string kGzip = "\x1f\x8b";
+const std::string kXz("\xfd\x37zXZ\x00", 6);
+const std::string kZstd = "\x28\xb5\x2f\xfd";
+const std::size_t kLongest = 6;
 
-int OpenFile(const std::string& path)
+const struct {
+    const char* begin;
+    const char* kind;
+} kNotUnderstood[] = {{"BZh", "bzip2"}, {"\x04\x22\x4d\x18", "lz4"}, {"PK\x03\x04", "zip"}, {"LZIP", "lzip"}};
+
+const std::size_t kBlockSize = 64 * 1024;
+const std::size_t kMostToCheck = std::size_t(1) << 30;
+
+bool BeginsWith(const std::string& text, const std::string& begin)
 {
-    if (path == "-") {
-        return STDIN_FILENO;
+    return text.compare(0, begin.size(), begin) == 0;
+}
+
+void RefuseOthers(const std::string& begin, const std::string& name)
+{
+    for (const auto& other : kNotUnderstood) {
+        if (BeginsWith(begin, other.begin)) {
+            throw TClientError(name + ": is compressed with " + other.kind + ", which is not understood; gzip, xz and zstd are");
+        }
     }
-    const int descriptor = open(path.c_str(), O_RDONLY | O_CLOEXEC);
-    if (descriptor < 0) {
-        throw TClientError(path + ": cannot be opened: " + std::strerror(errno));
-    }
-    struct stat status;
-    if (fstat(descriptor, &status) == 0 && S_ISDIR(status.st_mode)) {
-        close(descriptor);
-        throw TClientError(path + ": is a directory; name an inventory file, or - for standard input");
-    }
-    return descriptor;
 }
 
 }  // namespace
 
-TInventoryFile::TInventoryFile(const std::string& path)
-    : fName(path == "-" ? "standard input" : path), fArchive(archive_read_new(), &archive_read_free)
+TInventoryFile::TInventoryFile(const std::string& path) : fFile(path)
 {
-    fDescriptor = OpenFile(path);
-    try {
-        Open(fDescriptor);
-    } catch (...) {
-        if (fDescriptor != STDIN_FILENO) {
-            close(fDescriptor);
-        }
-        throw;
-    }
-}
-
-TInventoryFile::~TInventoryFile()
-{
-    if (fDescriptor != STDIN_FILENO) {
-        close(fDescriptor);
-    }
-}
-
-void TInventoryFile::Open(int descriptor)
-{
-    archive* reader = fArchive.get();
-    archive_read_support_filter_gzip(reader);
-    archive_read_support_filter_xz(reader);
-    archive_read_support_filter_zstd(reader);
-    archive_read_support_format_raw(reader);
-    archive_read_support_format_empty(reader);
-    archive_entry* entry = nullptr;
-    if (archive_read_open_fd(reader, descriptor, kBlockSize) != ARCHIVE_OK) {
-        Fail();
-    }
-    const int header = archive_read_next_header(reader, &entry);
-    fEmpty = header == ARCHIVE_EOF;
-    if (header != ARCHIVE_OK && !fEmpty) {
-        Fail();
+    const std::string& begin = fFile.Peek(kLongest);
+    if (BeginsWith(begin, kGzip)) {
+        fText = std::make_unique<TGzipReader>(fFile, fFile.GetName());
+    } else if (BeginsWith(begin, kXz)) {
+        fText = std::make_unique<TArchiveReader>(fFile, fFile.GetName(), "xz");
+    } else if (BeginsWith(begin, kZstd)) {
+        fText = std::make_unique<TArchiveReader>(fFile, fFile.GetName(), "zstd");
+    } else {
+        RefuseOthers(begin, fFile.GetName());
     }
 }
 
 std::size_t TInventoryFile::Read(char* buffer, std::size_t size)
 {
-    if (fEmpty) {
-        return 0;
-    }
-    const la_ssize_t count = archive_read_data(fArchive.get(), buffer, size);
-    if (count < 0) {
-        Fail();
-    }
-    return static_cast<std::size_t>(count);
+    return fText ? fText->Read(buffer, size) : fFile.Read(buffer, size);
 }
 
-void TInventoryFile::Fail() const
+void TInventoryFile::CheckRest()
 {
-    const char* const told = archive_error_string(fArchive.get());
-    std::string reason = told == nullptr ? "unknown reason" : told;
-    // What the decompressor of xz says of data that ends early helps nobody.
-    if (reason.find("No progress is possible") != std::string::npos) {
-        reason = "truncated xz input";
+    if (!fText) {
+        return;
     }
-    throw TClientError(fName + ": cannot be read: " + reason + "; is the file whole? (plain, gzip, xz and zstd are understood)");
+    std::vector<char> block(kBlockSize);
+    for (std::size_t total = 0; total < kMostToCheck;) {
+        const std::size_t count = Read(block.data(), block.size());
+        if (count == 0) {
+            break;
+        }
+        total += count;
+    }
 }
 
 }  // namespace NORVZEL20

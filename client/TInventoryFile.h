@@ -1,39 +1,35 @@
 #pragma once
 
-#include <cstddef>
 #include <memory>
 #include <string>
 
-struct archive;
+#include "client/IByteSource.h"
+#include "client/TInputFile.h"
 
 namespace NORVZEL20 {
 
 /// The text of an inventory file: plain, or decompressed from gzip, xz or zstd, which its first bytes tell.
 ///
 /// Threads: distinct files at once.
-class TInventoryFile {
+class TInventoryFile : public IByteSource {
   public:
-    /// Opens the file, or standard input for "-". Errors: TClientError where it cannot be opened or is a directory.
+    /// Opens the file, or standard input for "-". Errors: TClientError where it cannot be opened, is a directory or is compressed
+    /// otherwise; as of Read.
     explicit TInventoryFile(const std::string& path);
-    TInventoryFile(const TInventoryFile&) = delete;
-    TInventoryFile& operator=(const TInventoryFile&) = delete;
-    ~TInventoryFile();
 
-    /// Fills `buffer` with at most `size` bytes and returns how many there were; 0 at the end.
-    /// Errors: TClientError where reading fails or the compressed data is damaged or ends early.
-    std::size_t Read(char* buffer, std::size_t size);
+    /// Errors: also TClientError where the compressed data is damaged, ends early or has something else behind it.
+    std::size_t Read(char* buffer, std::size_t size) override;
+
+    /// To be called where the text makes no sense: reads on, so that damage of compressed data is told rather than what came of it.
+    /// Errors: as of Read. Cost: at most 1 GiB is decompressed.
+    void CheckRest();
 
     /// What messages call the file: its path, or "standard input".
-    const std::string& GetName() const { return fName; }
+    const std::string& GetName() const { return fFile.GetName(); }
 
   private:
-    void Open(int descriptor);
-    [[noreturn]] void Fail() const;
-
-    std::string fName;
-    std::unique_ptr<archive, int (*)(archive*)> fArchive;
-    int fDescriptor = -1;
-    bool fEmpty = false;
+    TInputFile fFile;
+    std::unique_ptr<IByteSource> fText;  // null where the file is plain
 };
 
 }  // namespace NORVZEL20

@@ -8,7 +8,8 @@
 
 namespace NORVZEL20 {
 
-/// Loads inventories, each into a namespace of its own, all at the same time.
+/// Loads inventories, each into a namespace of its own: at the same time as many as the hardware has threads, at least 2, at
+/// most 16.
 class TInventoryLoader {
   public:
     /// `console` must outlive this; it is told what was tolerated in the files.

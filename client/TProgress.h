@@ -20,7 +20,7 @@ class TProgress {
     ~TProgress();
 
   private:
-    void Wait();
+    void Wait() noexcept;
 
     IConsole& fConsole;
     const std::string fDoing;

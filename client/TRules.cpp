@@ -6,6 +6,7 @@
 #include <cerrno>
 #include <cstring>
 
+#include "client/LackOfMemory.h"
 #include "client/RulesFault.h"
 #include "client/TClientError.h"
 #include "client/TLogCapture.h"
@@ -44,6 +45,7 @@ TCIMDiffEngine::TRuleset ReadRuleset(TCIMDiffEngine& engine, const std::string& 
     try {
         return engine.ReadSpecFile(file);
     } catch (const TZELException& error) {
+        ThrowIfOutOfMemory(error);
         throw TClientError(DescribeRulesFault(file, shownName, log.GetMessages(), error));
     }
 }

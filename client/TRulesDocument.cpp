@@ -1,17 +1,30 @@
 #include "client/TRulesDocument.h"
 
-#include <cerrno>
+#include <algorithm>
 #include <cstring>
-#include <fstream>
-#include <iterator>
-#include <sstream>
 
-#include "client/TClientError.h"
+#include "client/TInputFile.h"
 #include "host/TXmlParser.h"
 
 namespace NORVZEL20 {
 
 namespace {
+
+const std::size_t kBlockSize = 64 * 1024;
+
+// By hand, because a stream hides a lack of memory.
+std::vector<std::string> SplitAtBlanks(const std::string& text)
+{
+    const char blanks[] = " \t\n\v\f\r";
+    std::vector<std::string> words;
+    std::size_t begin = text.find_first_not_of(blanks);
+    while (begin != std::string::npos) {
+        const std::size_t end = std::min(text.find_first_of(blanks, begin), text.size());
+        words.push_back(text.substr(begin, end - begin));
+        begin = text.find_first_not_of(blanks, end);
+    }
+    return words;
+}
 
 // Follows the document as the plug-in's parser does, but keeps lines and minds no fault.
 class TLineReader : public TXmlParser {
@@ -49,8 +62,7 @@ class TLineReader : public TXmlParser {
         if (attrs["default"] == "include") {
             element.defaultTreatment = TCIMDiffEngine::INCLUDE;
         }
-        std::istringstream keys(attrs["excludekeys"]);
-        element.excludedKeys.assign(std::istream_iterator<std::string>(keys), std::istream_iterator<std::string>());
+        element.excludedKeys = SplitAtBlanks(attrs["excludekeys"]);
         element.line = GetCurLine();
         fElements.push_back(element);
     }
@@ -62,10 +74,11 @@ class TLineReader : public TXmlParser {
 
 std::string ReadWhole(const std::string& path)
 {
-    std::ifstream file(path, std::ios::binary);
-    std::string text((std::istreambuf_iterator<char>(file)), std::istreambuf_iterator<char>());
-    if (!file.is_open() || file.bad()) {
-        throw TClientError(path + ": cannot be read: " + std::strerror(errno));
+    TInputFile file(path == "-" ? "./-" : path);  // rules never come from standard input
+    std::string text;
+    std::vector<char> block(kBlockSize);
+    while (const std::size_t count = file.Read(block.data(), block.size())) {
+        text.append(block.data(), count);
     }
     return text;
 }

@@ -114,6 +114,8 @@ void TSchemaCompletion::DeclareProperty(std::size_t source, const TInMemProperty
 {
     try {
         TSchemaCopier(fInventories[target].ns).CopyPropertyDecl(property, there);
+    } catch (const TSchemaLimitError&) {
+        throw;
     } catch (const TZELException&) {
         throw TClientError(fInventories[target].path + ": property " + property.GetName() + " of class " + there.GetName() +
                            " of " + fInventories[source].path + " cannot be declared here: " + DescribeConflict(there, property) +

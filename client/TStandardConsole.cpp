@@ -6,6 +6,8 @@
 #include <cstdlib>
 #include <cstring>
 
+#include "client/DisplayText.h"
+#include "client/StandardDescriptors.h"
 #include "client/TClientError.h"
 #include "client/WholeWrite.h"
 
@@ -27,6 +29,16 @@ bool IsSet(const char* variable)
     return value != nullptr && *value != '\0';
 }
 
+// Without memory: what could move a terminal is not told.
+void SayPlainly(std::string_view line) noexcept
+{
+    for (const char character : line) {
+        const bool isPlain = character >= ' ' && character <= '~';
+        WriteWhole(STDERR_FILENO, std::string_view(isPlain ? &character : "?", 1));
+    }
+    WriteWhole(STDERR_FILENO, "\n");
+}
+
 }  // namespace
 
 TStandardConsole::TStandardConsole()
@@ -36,7 +48,7 @@ TStandardConsole::TStandardConsole()
 void TStandardConsole::WriteResult(const std::string& text)
 {
     const int error = WriteWhole(STDOUT_FILENO, text);
-    if (error == EPIPE) {
+    if (error == EPIPE || (error == EBADF && IsClosed(STDOUT_FILENO))) {
         throw TClientError("");
     }
     if (error != 0) {
@@ -44,21 +56,26 @@ void TStandardConsole::WriteResult(const std::string& text)
     }
 }
 
-void TStandardConsole::Say(const std::string& line) noexcept
+void TStandardConsole::Say(std::string_view line) noexcept
 {
     const std::lock_guard<std::mutex> lock(fMutex);
     if (fProgressShown) {
         WriteWhole(STDERR_FILENO, kWipeLine);
         fProgressShown = false;
     }
-    WriteWhole(STDERR_FILENO, line + "\n");
+    try {
+        WriteWhole(STDERR_FILENO, EscapeForDisplay(line) + "\n");
+    } catch (const std::exception&) {
+        SayPlainly(line);
+    }
 }
 
-void TStandardConsole::ShowProgress(const std::string& text) noexcept
+void TStandardConsole::ShowProgress(std::string_view text) noexcept
 {
     const std::lock_guard<std::mutex> lock(fMutex);
     if (fProgress && (fProgressShown || !text.empty())) {
-        WriteWhole(STDERR_FILENO, kWipeLine + text);
+        WriteWhole(STDERR_FILENO, kWipeLine);
+        WriteWhole(STDERR_FILENO, text);
         fProgressShown = !text.empty();
     }
 }

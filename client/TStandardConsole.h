@@ -12,9 +12,9 @@ class TStandardConsole : public IConsole {
     TStandardConsole();
 
     void WriteResult(const std::string& text) override;
-    void Say(const std::string& line) noexcept override;
+    void Say(std::string_view line) noexcept override;
     bool IsColored() const override { return fColored; }
-    void ShowProgress(const std::string& text) noexcept override;
+    void ShowProgress(std::string_view text) noexcept override;
 
   private:
     std::mutex fMutex;

@@ -1,9 +1,7 @@
 #include "client/TTemporaryFile.h"
 
 #include <stdlib.h>
-#include <unistd.h>
 
-#include <cerrno>
 #include <cstring>
 
 #include "client/TClientError.h"
@@ -13,30 +11,27 @@ namespace NORVZEL20 {
 
 namespace {
 
-std::string Template()
+std::string Begin()
 {
     const char* folder = getenv("TMPDIR");
-    return std::string(folder == nullptr || *folder == '\0' ? "/tmp" : folder) + "/cimdelta-XXXXXX";
+    return std::string(folder == nullptr || *folder == '\0' ? "/tmp" : folder) + "/cimdelta-";
 }
 
 }  // namespace
 
-TTemporaryFile::TTemporaryFile(const std::string& content) : fPath(Template())
+TTemporaryFile::TTemporaryFile(const std::string& content) : fFile(Begin())
 {
-    const int descriptor = mkstemp(&fPath[0]);
-    if (descriptor < 0) {
-        throw TClientError(fPath + ": no temporary file can be made: " + std::strerror(errno) + "; TMPDIR names the folder");
+    if (fFile.GetError() != 0) {
+        throw TClientError(fFile.GetPath() + ": no temporary file can be made: " + std::strerror(fFile.GetError()) +
+                           "; TMPDIR names the folder");
     }
-    const int error = WriteWhole(descriptor, content);
-    if (close(descriptor) != 0 || error != 0) {
-        unlink(fPath.c_str());
-        throw TClientError(fPath + ": cannot be written: " + std::strerror(error != 0 ? error : errno));
+    int error = WriteWhole(fFile.GetDescriptor(), content);
+    if (error == 0) {
+        error = fFile.Close();
     }
-}
-
-TTemporaryFile::~TTemporaryFile()
-{
-    unlink(fPath.c_str());
+    if (error != 0) {
+        throw TClientError(fFile.GetPath() + ": cannot be written: " + std::strerror(error) + "; TMPDIR names the folder");
+    }
 }
 
 }  // namespace NORVZEL20

@@ -1,18 +1,21 @@
 #include "client/WholeWrite.h"
 
+#include <poll.h>
 #include <unistd.h>
 
 #include <cerrno>
 
 namespace NORVZEL20 {
 
-int WriteWhole(int descriptor, const std::string& text) noexcept
+int WriteWhole(int descriptor, std::string_view text) noexcept
 {
-    std::size_t done = 0;
-    while (done < text.size()) {
-        const ssize_t written = write(descriptor, text.data() + done, text.size() - done);
+    while (!text.empty()) {
+        const ssize_t written = write(descriptor, text.data(), text.size());
         if (written >= 0) {
-            done += static_cast<std::size_t>(written);
+            text.remove_prefix(static_cast<std::size_t>(written));
+        } else if (errno == EAGAIN) {
+            pollfd wait = {descriptor, POLLOUT, 0};
+            poll(&wait, 1, -1);
         } else if (errno != EINTR) {
             return errno;
         }

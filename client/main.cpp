@@ -1,12 +1,19 @@
 #include <csignal>
 
 #include "client/CommandLine.h"
+#include "client/EndingSignals.h"
+#include "client/LackOfMemory.h"
+#include "client/StandardDescriptors.h"
 #include "client/TStandardConsole.h"
 
 int main(int argc, char** argv)
 {
-    // A closed pipe is an error of the write then, and the command ends with its own status.
+    // A closed pipe or a file that grows too large is an error of the write then, and the command ends with its own status.
     std::signal(SIGPIPE, SIG_IGN);
+    std::signal(SIGXFSZ, SIG_IGN);
+    NORVZEL20::ReserveStandardDescriptors();
+    NORVZEL20::RemoveUnfinishedFilesOnSignals();
+    NORVZEL20::EndInOrderWithoutMemory();
     NORVZEL20::TStandardConsole console;
     return NORVZEL20::RunClient(argc, argv, console);
 }

@@ -274,9 +274,12 @@ void TCimXmlLoader::Explain(const TZELException& error, const TInMemInstance& in
 {
     const EStatus status = error.GetStatusCode().GetStatus();
     const std::string ofClass = " of class " + Quote(instance.GetInMemClass()->GetName());
-    if (status == EStatus::kAlreadyExists)
-        fContext.Fail(status, "found a second instance " + instance.GetReference().GetPath() + "; instances" + ofClass +
-                                  " must differ in their keys");
+    if (status == EStatus::kAlreadyExists) {
+        constexpr std::size_t kLongestPath = 200;
+        const std::string path = instance.GetReference().GetPath();
+        fContext.Fail(status, "found a second instance " + (path.size() > kLongestPath ? Quote(path) : path) + "; instances" +
+                                  ofClass + " must differ in their keys");
+    }
     if (status == EStatus::kKeyMissing)
         fContext.Fail(status, "found an instance" + ofClass + " without a value for its key " + Quote(*instance.FindMissingKey()) +
                                   "; every key needs one");

@@ -17,13 +17,13 @@ namespace {
 class TKeptConsole : public IConsole {
   public:
     void WriteResult(const std::string& text) override { fResult += text; }
-    void Say(const std::string& line) noexcept override
+    void Say(std::string_view line) noexcept override
     {
         const std::lock_guard<std::mutex> lock(fMutex);
-        fSaid += line + "\n";
+        fSaid.append(line) += "\n";
     }
     bool IsColored() const override { return false; }
-    void ShowProgress(const std::string&) noexcept override {}
+    void ShowProgress(std::string_view) noexcept override {}
 
     const std::string& GetResult() const { return fResult; }
     const std::string& GetSaid() const { return fSaid; }

@@ -11,16 +11,16 @@ namespace NORVZEL20 {
 class TFakeConsole : public IConsole {
   public:
     void WriteResult(const std::string& text) override { fOut += text; }
-    void Say(const std::string& line) noexcept override
+    void Say(std::string_view line) noexcept override
     {
         const std::lock_guard<std::mutex> lock(fMutex);
-        fErr += line + "\n";
+        fErr.append(line) += "\n";
     }
     bool IsColored() const override { return fColored; }
-    void ShowProgress(const std::string& text) noexcept override
+    void ShowProgress(std::string_view text) noexcept override
     {
         const std::lock_guard<std::mutex> lock(fMutex);
-        fProgress += text + "|";
+        fProgress.append(text) += "|";
     }
 
     std::string fOut;

@@ -1,0 +1,169 @@
+#include <zlib.h>
+
+#include <utility>
+
+#include "tests/client/ClientTest.h"
+
+namespace NORVZEL20 {
+namespace {
+
+/// Inventories whose compressed data was damaged on the way.
+class CompressedInputTest : public ClientTest {
+  protected:
+    /// What comes of showing a file of that content: its text, or the message, in which the file is called F.
+    std::string Show(const std::string& content)
+    {
+        const std::string file = Scratch("damaged", content);
+        Run({"show", file, "-o", "cimxml"});
+        return fStatus == 2 ? Shorten(fErr, file, "F") : fOut;
+    }
+
+    /// Shows what was damaged: the outcome is the very text, or the message that the file is damaged. A file of another beginning
+    /// is taken for text, and malformed. Returns whether it was refused.
+    bool IsRefused(const std::string& damaged, bool hasBeginning)
+    {
+        const std::string outcome = Show(damaged);
+        if (outcome == fWhole) {
+            return false;
+        }
+        const std::string told = "cimdelta: F: cannot be read: the " + fKind + " data is damaged (";
+        EXPECT_EQ(2, fStatus);
+        EXPECT_EQ("", fOut);
+        EXPECT_EQ(hasBeginning ? told : "cimdelta: F:1:", outcome.substr(0, hasBeginning ? told.size() : 14)) << outcome;
+        EXPECT_EQ(outcome.size() - 1, outcome.find('\n')) << outcome;
+        return true;
+    }
+
+    /// Flips each bit of the file in turn, one in each byte, and cuts it at each length. Returns how many were refused.
+    std::pair<std::size_t, std::size_t> Damage(const std::string& file, std::size_t beginning)
+    {
+        std::pair<std::size_t, std::size_t> refused;
+        for (std::size_t at = 0; at < file.size(); ++at) {
+            SCOPED_TRACE(fKind + ", byte " + std::to_string(at));
+            std::string flipped = file;
+            flipped[at] = static_cast<char>(flipped[at] ^ (1 << at % 8));
+            refused.first += IsRefused(flipped, at >= beginning) ? 1 : 0;
+            refused.second += IsRefused(file.substr(0, at), at >= beginning) ? 1 : 0;
+        }
+        return refused;
+    }
+
+    /// A gzip file that holds the text as it is, in one block, with the checksum and the length of `checked`.
+    static std::string StoredGzip(const std::string& text, const std::string& checked)
+    {
+        const auto sum = crc32(0, reinterpret_cast<const Bytef*>(checked.data()), static_cast<uInt>(checked.size()));
+        return std::string("\x1f\x8b\x08\0\0\0\0\0\0\x03\x01", 11) + Number(text.size(), 2) + Number(~text.size(), 2) + text +
+               Number(sum, 4) + Number(checked.size(), 4);
+    }
+
+    static std::string Number(unsigned long number, int bytes)
+    {
+        std::string text;
+        for (; bytes > 0; --bytes, number >>= 8) {
+            text += static_cast<char>(number & 0xff);
+        }
+        return text;
+    }
+
+    const std::string fWhole = Show(ReadFile(CIMDELTA_CLIENT_TEST_DATA "/web02.xml"));
+    std::string fKind;
+};
+
+TEST_F(CompressedInputTest, AFlippedBitOrACutIsFoundWhereverItIs)
+{
+    const struct {
+        const char* kind;
+        const char* file;
+        std::size_t beginning;  // what tells the kind
+        std::size_t harmless;   // how many bytes at most say nothing about the text
+    } rows[] = {{"gzip", "web02.xml.gz", 2, 16}, {"xz", "web02.xml.xz", 6, 0}, {"zstd", "web02.xml.zst", 4, 8}};
+    for (const auto& row : rows) {
+        fKind = row.kind;
+        const std::string file = ReadFile(row.file);
+        ASSERT_EQ(fWhole, Show(file));
+        const std::pair<std::size_t, std::size_t> refused = Damage(file, row.beginning);
+        EXPECT_LE(file.size() - row.harmless, refused.first);
+        EXPECT_EQ(file.size(), refused.second);
+        RecordProperty(fKind + "Refused", std::to_string(refused.first + refused.second));
+    }
+}
+
+TEST_F(CompressedInputTest, AValueThatIsNotTheOneThatWasCompressedIsNoAgreement)
+{
+    const std::string text = ReadFile("web01.xml");
+    std::string other = text;
+    other.replace(other.find("500"), 3, "501");
+    ASSERT_EQ(0u, Result({"compare", "web01.xml", Scratch("good", StoredGzip(text, text))}).find("No differences"));
+    const std::string hidden = Scratch("hidden", StoredGzip(text, other));
+    EXPECT_EQ("cimdelta: H: cannot be read: the gzip data is damaged (incorrect data check); fetch or make it anew\n",
+              Shorten(Complaint({"compare", "web01.xml", hidden}), hidden, "H"));
+    const std::string longer = Scratch("longer", StoredGzip(text, text).replace(text.size() + 19, 1, "\1"));
+    EXPECT_EQ("cimdelta: H: cannot be read: the gzip data is damaged (incorrect length check); fetch or make it anew\n",
+              Shorten(Complaint({"compare", "web01.xml", longer}), longer, "H"));
+}
+
+TEST_F(CompressedInputTest, SeveralMembersAreOneText)
+{
+    const std::string text = ReadFile("web02.xml");
+    const std::string begin = text.substr(0, 1000);
+    const std::string rest = text.substr(1000);
+    EXPECT_EQ(fWhole, Show(StoredGzip(begin, begin) + StoredGzip("", "") + StoredGzip(rest, rest)));
+    EXPECT_EQ("cimdelta: F: cannot be read: the gzip data is damaged (incorrect data check); fetch or make it anew\n",
+              Show(StoredGzip(begin, rest) + StoredGzip(rest, rest)));
+}
+
+TEST_F(CompressedInputTest, WhatStandsBehindTheDataIsRefused)
+{
+    const struct {
+        const char* file;
+        const char* told;
+    } rows[] = {
+        {"web02.xml.gz", "the gzip data is damaged (something else stands behind it)"},
+        {"web02.xml.xz", "the xz data is damaged (Lzma library error: Corrupted input data)"},
+        {"web02.xml.zst", "the zstd data is damaged (Zstd decompression failed: Unknown frame descriptor)"},
+    };
+    for (const auto& row : rows) {
+        EXPECT_EQ(std::string("cimdelta: F: cannot be read: ") + row.told + "; fetch or make it anew\n",
+                  Show(ReadFile(row.file) + "<!-- garbage -->"));
+        EXPECT_EQ(fWhole, Show(ReadFile(row.file)));
+    }
+    EXPECT_EQ("cimdelta: F: cannot be read: the gzip data is damaged (incorrect header check); fetch or make it anew\n",
+              Show(ReadFile("web02.xml.gz") + "\x1fgarbage"));
+    EXPECT_EQ("cimdelta: F: cannot be read: the gzip data is damaged (it ends early); fetch or make it anew\n",
+              Show(ReadFile("web02.xml.gz") + "\x1f"));
+}
+
+TEST_F(CompressedInputTest, DamageIsToldRatherThanWhatCameOfIt)
+{
+    const std::string text = ReadFile("web02.xml");
+    std::string malformed = text;
+    malformed[malformed.find("</CLASS>")] = ' ';
+    EXPECT_EQ("cimdelta: F: cannot be read: the gzip data is damaged (incorrect data check); fetch or make it anew\n",
+              Show(StoredGzip(malformed, malformed) + StoredGzip("\n", "\t")));
+    EXPECT_EQ(Show(malformed), Show(StoredGzip(malformed, malformed)));
+}
+
+TEST_F(CompressedInputTest, OtherCompressionsAreNamed)
+{
+    const std::string told = "cimdelta: F: is compressed with K, which is not understood; gzip, xz and zstd are\n";
+    EXPECT_EQ(Shorten(told, "K", "bzip2"), Show("BZh91AY&SY"));
+    EXPECT_EQ(Shorten(told, "K", "lz4"), Show("\x04\x22\x4d\x18"));
+    EXPECT_EQ(Shorten(told, "K", "zip"), Show("PK\x03\x04\x14"));
+    EXPECT_EQ(Shorten(told, "K", "lzip"), Show("LZIP\x01"));
+}
+
+TEST_F(CompressedInputTest, ALargeFileThatEndsEarlyIsTold)
+{
+    const std::string whole = ReadFile(CIMDELTA_PAIR_DATA "/a.xml.xz");
+    EXPECT_EQ("cimdelta: F: cannot be read: the xz data is damaged (it ends early); fetch or make it anew\n",
+              Show(whole.substr(0, whole.size() / 2)));
+}
+
+TEST_F(CompressedInputTest, NothingCompressedIsAnEmptyDocument)
+{
+    EXPECT_EQ(Show(""), Show(StoredGzip("", "")));
+    EXPECT_EQ("cimdelta: F:1:1: found an empty document, expected CIM-XML\n", Show(""));
+}
+
+}  // namespace
+}  // namespace NORVZEL20

@@ -1,0 +1,56 @@
+#include <dlfcn.h>
+#include <pthread.h>
+
+#include <atomic>
+#include <cerrno>
+
+#include "tests/client/ClientTest.h"
+
+namespace NORVZEL20 {
+namespace {
+
+/// How many more threads are to be had; any number where it is negative.
+std::atomic<int> gLeft{-1};
+
+/// Threads that the operating system refuses.
+class ThreadFaultTest : public ClientTest {
+  protected:
+    void TearDown() override
+    {
+        gLeft = -1;
+        ClientTest::TearDown();
+    }
+};
+
+TEST_F(ThreadFaultTest, ThoseThatAreNotToBeHadAreDoneWithout)
+{
+    const std::vector<std::string> compare = {"compare",   "web01.xml",       "web02.xml.gz",
+                                              "web03.xml", "web01-again.xml", "two-boots.xml"};
+    const std::string expected = Result(compare);
+    for (const int left : {0, 1, 2, 3}) {
+        gLeft = left;
+        EXPECT_EQ(expected, Result(compare)) << left;
+        EXPECT_EQ(0, gLeft) << "they are asked for";
+        gLeft = left;
+        EXPECT_EQ("cimdelta: none.xml: cannot be opened: No such file or directory\n",
+                  Complaint({"compare", "web01.xml", "none.xml", ".", "web02.xml"}));
+    }
+}
+
+}  // namespace
+}  // namespace NORVZEL20
+
+// Found before the library's own function of that name.
+extern "C" int pthread_create(pthread_t* thread, const pthread_attr_t* attributes, void* (*start)(void*), void* argument) noexcept
+{
+    using NORVZEL20::gLeft;
+    using TFunction = int (*)(pthread_t*, const pthread_attr_t*, void* (*)(void*), void*);
+    static const auto function = reinterpret_cast<TFunction>(dlsym(RTLD_NEXT, "pthread_create"));
+    if (gLeft == 0) {
+        return EAGAIN;
+    }
+    if (gLeft > 0) {
+        --gLeft;
+    }
+    return function(thread, attributes, start, argument);
+}
