@@ -1,20 +1,10 @@
 // Documents that expand to far more than they are: entities within entities, long entities often used, entities without end.
 #include "tests/hostile/HostileRow.h"
+#include "tests/hostile/Repeat.h"
 
 namespace NORVZEL20 {
 
 namespace {
-
-constexpr std::size_t kMegabyte = 1u << 20;
-
-std::string Repeat(const std::string& unit, std::size_t times)
-{
-    std::string text;
-    text.reserve(unit.size() * times);
-    for (std::size_t i = 0; i < times; ++i)
-        text += unit;
-    return text;
-}
 
 /// Ten entities, each of ten of the one before: ten thousand million letters.
 THostileDocument BillionLaughs(const std::string& content)

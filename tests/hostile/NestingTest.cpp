@@ -2,21 +2,11 @@
 #include "embedded/TCimXmlPopulator.h"
 #include "embedded/TInMemNamespace.h"
 #include "tests/hostile/HostileRow.h"
+#include "tests/hostile/Repeat.h"
 
 namespace NORVZEL20 {
 
 namespace {
-
-constexpr std::size_t kMegabyte = 1u << 20;
-
-std::string Repeat(const std::string& unit, std::size_t times)
-{
-    std::string text;
-    text.reserve(unit.size() * times);
-    for (std::size_t i = 0; i < times; ++i)
-        text += unit;
-    return text;
-}
 
 std::string Attributes(std::size_t count)
 {

@@ -3,29 +3,14 @@
 #include <set>
 #include <vector>
 
-#include "host/TAddToVectorCallback.h"
 #include "spec/TDiffClassRules.h"
 #include "tests/support/CallText.h"
+#include "tests/support/InstanceAccess.h"
 #include "tests/support/TTestAccess.h"
 
 namespace NORVZEL20 {
 
 namespace {
-
-using TInstances = std::vector<boost::shared_ptr<ICIMInstance>>;
-
-TInstances InstancesOf(boost::shared_ptr<ICIMNamespace> ns, const std::string& className)
-{
-    TInstances instances;
-    ns->GetClass(className, TCallContext())
-        ->EnumerateInstances(TAddToVectorCallback<ICIMInstance>(&instances), false, TCallContext());
-    return instances;
-}
-
-TCIMValue ValueOf(const ICIMInstance& instance, const std::string& name)
-{
-    return instance.GetProperty(name, TCallContext())->GetValue(TCallContext());
-}
 
 std::string IndicesText(const TCIMValue& indices)
 {

@@ -1,0 +1,20 @@
+#pragma once
+
+#include <cstddef>
+#include <string>
+
+namespace NORVZEL20 {
+
+constexpr std::size_t kMegabyte = 1u << 20;
+
+/// The text so many times, without a break.
+inline std::string Repeat(const std::string& unit, std::size_t times)
+{
+    std::string text;
+    text.reserve(unit.size() * times);
+    for (std::size_t i = 0; i < times; ++i)
+        text += unit;
+    return text;
+}
+
+}  // namespace NORVZEL20
