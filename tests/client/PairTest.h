@@ -1,6 +1,7 @@
 #pragma once
 
 #include <string>
+#include <vector>
 
 #include "tests/client/ClientTest.h"
 #include "tests/client/Documents.h"
@@ -11,11 +12,13 @@ namespace NORVZEL20 {
 class PairTest : public ClientTest {
   protected:
     /// The report of the comparison, or the complaint; the documents are called "a" and "b", without the paths of their files.
-    std::string Compare(const std::string& a, const std::string& b)
+    std::string Compare(const std::string& a, const std::string& b, const std::vector<std::string>& options = {})
     {
         const std::string first = Scratch("a.xml", a);
         const std::string second = Scratch("b.xml", b);
-        Run({"compare", first, second});
+        std::vector<std::string> arguments{"compare", first, second};
+        arguments.insert(arguments.end(), options.begin(), options.end());
+        Run(arguments);
         return Named(fStatus == 2 ? fErr : fOut, first, second);
     }
 

@@ -65,5 +65,37 @@ TEST_F(SchemaConflictTest, ValuesOfDifferentTypesAreEqualWhereThereAreNone)
               Compare(disk("uint32", Value("Size", "1", "uint32")), disk("uint64", Value("Size", "1", "uint64"))));
 }
 
+/// Where another inventory's operating system has keys that nobody knows values of, any will do.
+TEST_F(SchemaConflictTest, AnOperatingSystemIsMadeWhateverTypesItsKeysHave)
+{
+    std::string keys = KeyProperty("Name");
+    for (const std::string type : {"boolean", "uint8", "sint8", "uint16", "sint16", "uint32", "sint32", "uint64", "sint64",
+                                   "real32", "real64", "char16", "datetime", "string"}) {
+        keys += "<PROPERTY NAME=\"Key_" + type + "\" TYPE=\"" + type + "\">" + std::string(kKey) + "</PROPERTY>";
+    }
+    keys += "<PROPERTY.REFERENCE NAME=\"Key_reference\">" + std::string(kKey) + "</PROPERTY.REFERENCE>";
+    const std::string declared = Document(Class("KALMO_OperatingSystem", "", keys));
+    EXPECT_EQ("Nothing was compared between a and b.\n\n"
+              "Compared: 0 classes; 0 instances of a, 0 instances of b.\n"
+              "Not compared, because cimdelta made it: KALMO_OperatingSystem (1 / 1).\n"
+              "Made in a: an instance of KALMO_OperatingSystem.\n"
+              "Made in b: an instance of KALMO_OperatingSystem.\n",
+              Compare(declared, declared));
+}
+
+/// What is told of declarations as JSON.
+TEST_F(SchemaConflictTest, TypesAndKeysThatDifferAreToldAsJson)
+{
+    const std::string one = Document(System() + Class("Disk", "", KeyProperty("Id") + Declaration("Size", "uint32")));
+    const std::string other =
+        Document(System() + Class("Disk", "", KeyProperty("Id") + KeyProperty("Bus") + Declaration("Size", "string")));
+    const auto note = [](const std::string& kind, const std::string& property) {
+        return "      {\n        \"kind\": \"" + kind + "\",\n        \"inventory\": \"b\",\n        \"asIn\": \"a\",\n" +
+               "        \"class\": \"Disk\"" + property + "\n      },\n";
+    };
+    const std::string notes = note("typeDiffers", ",\n        \"property\": \"Size\"") + note("keysDiffer", "");
+    EXPECT_NE(std::string::npos, Compare(one, other, {"-o", "json"}).find("    \"schema\": [\n" + notes)) << fOut;
+}
+
 }  // namespace
 }  // namespace NORVZEL20

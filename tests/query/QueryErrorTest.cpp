@@ -37,6 +37,8 @@ TEST_F(QueryErrorTest, EachBadQueryIsToldWithItsPlace)
         {"", "16: query, column 1: expected SELECT, found the end of the query"},
         {"SELEC * FROM Disk", "16: query, column 1: expected SELECT, found 'SELEC'"},
         {"SELECT", "16: query, column 7: expected * or the name of a property, found the end of the query"},
+        {"SELECT * FROM Disk WHERE Disk = 1", "15: query, column 26: class 'Disk' has no property 'Disk'"},
+        {"SELECT * FROM Disk WHERE Id = Disk", "15: query, column 31: class 'Disk' has no property 'Disk'"},
         {"SELECT FROM Disk", "16: query, column 8: expected * or the name of a property, found 'FROM'"},
         {"SELECT * FORM Disk", "16: query, column 10: expected FROM, found 'FORM'"},
         {"SELECT Id Size FROM Disk", "16: query, column 11: expected FROM, found 'Size'"},
