@@ -39,13 +39,6 @@ std::vector<boost::shared_ptr<ICIMInstance>> InstancesOf(ICIMClass& cls)
     return instances;
 }
 
-std::vector<boost::shared_ptr<ICIMPropertyDecl>> PropertyDeclsOf(const ICIMClass& cls)
-{
-    std::vector<boost::shared_ptr<ICIMPropertyDecl>> decls;
-    cls.EnumeratePropertyDecls(TAddToVectorCallback<ICIMPropertyDecl>(&decls), TCallContext());
-    return decls;
-}
-
 std::vector<boost::shared_ptr<ICIMProperty>> PropertiesOf(const ICIMInstance& instance)
 {
     std::vector<boost::shared_ptr<ICIMProperty>> properties;

@@ -14,7 +14,6 @@ namespace NORVZEL20 {
 
 std::vector<boost::shared_ptr<ICIMClass>> SubclassesOf(ICIMClass& cls);
 std::vector<boost::shared_ptr<ICIMInstance>> InstancesOf(ICIMClass& cls);
-std::vector<boost::shared_ptr<ICIMPropertyDecl>> PropertyDeclsOf(const ICIMClass& cls);
 std::vector<boost::shared_ptr<ICIMProperty>> PropertiesOf(const ICIMInstance& instance);
 std::vector<std::string> KeyNamesOf(const ICIMClass& cls);
 
