@@ -63,7 +63,10 @@ void CheckDateTime(std::string_view text)
     TCIMDateTime value;
     if (!TCIMDateTime::Parse(text, value))
         return;
-    PromiseEqual(std::string(text), value.ToText(), "a datetime keeps its text");
+    // The one offset that is written in two ways.
+    const std::string kept(text);
+    const bool isMinusZero = kept.substr(kept.size() - 4) == "-000";
+    PromiseEqual(isMinusZero ? kept.substr(0, kept.size() - 4) + "+000" : kept, value.ToText(), "a datetime keeps its text");
     Promise(value == value && !(value < value), "a datetime equals itself");
     const TCIMDateTime epoch;
     Promise((value < epoch) + (epoch < value) + (value == epoch) <= 1, "datetimes have an order");
