@@ -26,7 +26,7 @@ TEST_P(GrammarTest, VersionsUpToOnePointZeroAreAcceptedAsText)
 
 TEST_P(GrammarTest, VersionsThatCompareGreaterAreRefused)
 {
-    for (const std::string version : {"1.1", "1.00", "1.01", "2", "10", "a"}) {
+    for (const std::string version : {"1.1", "1.0 ", "1.00", "1.01", "2", "10", "a"}) {
         EXPECT_EQ("status 9", Read("<DifftoolSpec version=\"" + version + "\"/>")) << version;
     }
 }
