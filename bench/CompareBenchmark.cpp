@@ -6,8 +6,8 @@
 #include <boost/smart_ptr/shared_ptr.hpp>
 
 #include "bench/BenchmarkFiles.h"
-#include "embedded/TCimXmlPopulator.h"
-#include "embedded/TInMemNamespace.h"
+#include "embedded/cimxml/TCimXmlPopulator.h"
+#include "embedded/store/TInMemNamespace.h"
 #include "host/TNamespaceProviderManager.h"
 #include "provider/TDeltaNamespace.h"
 

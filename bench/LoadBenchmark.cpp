@@ -8,8 +8,8 @@
 #include <cstring>
 
 #include "bench/BenchmarkFiles.h"
-#include "embedded/TCimXmlPopulator.h"
-#include "embedded/TInMemNamespace.h"
+#include "embedded/cimxml/TCimXmlPopulator.h"
+#include "embedded/store/TInMemNamespace.h"
 
 namespace NORVZEL20 {
 namespace {

@@ -6,12 +6,12 @@
 #include <functional>
 #include <sstream>
 
-#include "client/CheckCommand.h"
-#include "client/CompareCommand.h"
-#include "client/ExplainCommand.h"
-#include "client/LackOfMemory.h"
-#include "client/QueryCommand.h"
-#include "client/ShowCommand.h"
+#include "client/commands/CheckCommand.h"
+#include "client/commands/CompareCommand.h"
+#include "client/commands/ExplainCommand.h"
+#include "client/commands/QueryCommand.h"
+#include "client/commands/ShowCommand.h"
+#include "client/process/LackOfMemory.h"
 
 namespace NORVZEL20 {
 

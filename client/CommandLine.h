@@ -1,6 +1,6 @@
 #pragma once
 
-#include "client/IConsole.h"
+#include "client/process/IConsole.h"
 
 namespace NORVZEL20 {
 

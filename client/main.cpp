@@ -1,10 +1,11 @@
 #include <csignal>
 
 #include "client/CommandLine.h"
-#include "client/EndingSignals.h"
-#include "client/LackOfMemory.h"
-#include "client/StandardDescriptors.h"
-#include "client/TStandardConsole.h"
+#include "client/files/TUnfinishedFile.h"
+#include "client/process/EndingSignals.h"
+#include "client/process/LackOfMemory.h"
+#include "client/process/StandardDescriptors.h"
+#include "client/process/TStandardConsole.h"
 
 int main(int argc, char** argv)
 {
@@ -12,8 +13,8 @@ int main(int argc, char** argv)
     std::signal(SIGPIPE, SIG_IGN);
     std::signal(SIGXFSZ, SIG_IGN);
     NORVZEL20::ReserveStandardDescriptors();
-    NORVZEL20::RemoveUnfinishedFilesOnSignals();
-    NORVZEL20::EndInOrderWithoutMemory();
+    NORVZEL20::CleanUpOnEndingSignals(&NORVZEL20::TUnfinishedFile::RemoveAll);
+    NORVZEL20::EndInOrderWithoutMemory(&NORVZEL20::TUnfinishedFile::RemoveAll);
     NORVZEL20::TStandardConsole console;
     return NORVZEL20::RunClient(argc, argv, console);
 }

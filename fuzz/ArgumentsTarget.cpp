@@ -3,7 +3,7 @@
 #include <vector>
 
 #include "client/CommandLine.h"
-#include "client/IConsole.h"
+#include "client/process/IConsole.h"
 #include "fuzz/Promise.h"
 #include "fuzz/SampleInventory.h"
 #include "fuzz/TFuzzTarget.h"

@@ -1,7 +1,7 @@
 #include <algorithm>
 #include <cstring>
 
-#include "embedded/TCimXmlPopulator.h"
+#include "embedded/cimxml/TCimXmlPopulator.h"
 #include "fuzz/Promise.h"
 #include "fuzz/SampleInventory.h"
 #include "fuzz/TFuzzTarget.h"

@@ -2,8 +2,8 @@
 #include <iterator>
 #include <set>
 
-#include "embedded/TQuery.h"
-#include "embedded/TQueryError.h"
+#include "embedded/query/TQuery.h"
+#include "embedded/query/TQueryError.h"
 #include "fuzz/Promise.h"
 #include "fuzz/SampleInventory.h"
 #include "fuzz/TFuzzTarget.h"

@@ -1,7 +1,7 @@
 #include "fuzz/SampleInventory.h"
 
-#include "embedded/TCimXmlPopulator.h"
-#include "embedded/TCimXmlWriter.h"
+#include "embedded/cimxml/TCimXmlPopulator.h"
+#include "embedded/cimxml/TCimXmlWriter.h"
 
 namespace NORVZEL20 {
 

@@ -3,7 +3,7 @@
 #include <string>
 #include <vector>
 
-#include "embedded/TCoreLog.h"
+#include "embedded/services/TCoreLog.h"
 #include "host/ILogger.h"
 
 namespace NORVZEL20 {

@@ -1,4 +1,4 @@
-#include "embedded/TValueText.h"
+#include "embedded/value/TValueText.h"
 #include "fuzz/Promise.h"
 #include "fuzz/TFuzzTarget.h"
 #include "host/TCIMDateTime.h"

@@ -3,7 +3,7 @@
 #include <mutex>
 #include <string>
 
-#include "client/IConsole.h"
+#include "client/process/IConsole.h"
 
 namespace NORVZEL20 {
 

@@ -7,7 +7,7 @@
 
 #include <csignal>
 
-#include "client/EndingSignals.h"
+#include "client/process/EndingSignals.h"
 
 namespace NORVZEL20 {
 

@@ -1,6 +1,6 @@
 #include <gtest/gtest.h>
 
-#include "embedded/TProviderLibrary.h"
+#include "embedded/services/TProviderLibrary.h"
 #include "host/ICIMNamespace.h"
 #include "host/TNamespaceProviderManager.h"
 #include "host/TZELException.h"

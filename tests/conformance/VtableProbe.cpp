@@ -1,7 +1,7 @@
 // Has the compiler lay out the virtual table of every type whose order of operations is part of the contract: a destructor sets
 // the table of its class. Compiled for the dump alone, never linked.
-#include "embedded/TInMemNamedElement.h"
-#include "embedded/TStubClass.h"
+#include "embedded/store/TInMemNamedElement.h"
+#include "embedded/value/TStubClass.h"
 #include "host/ICIMClass.h"
 #include "host/ICIMInstance.h"
 #include "host/ICIMNamespace.h"

@@ -5,8 +5,8 @@
 #include "tests/engine/TEngineFixture.h"
 #include "tests/support/Dump.h"
 #include "tests/support/TTestAccess.h"
-#include "tests/support/TWatchedClass.h"
-#include "tests/support/TWatchedInstance.h"
+#include "tests/support/watched/TWatchedClass.h"
+#include "tests/support/watched/TWatchedInstance.h"
 
 namespace NORVZEL20 {
 namespace {

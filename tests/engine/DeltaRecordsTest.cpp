@@ -1,12 +1,12 @@
 #include <boost/smart_ptr/make_shared.hpp>
 
-#include "embedded/TAssertionFailure.h"
+#include "embedded/services/TAssertionFailure.h"
 #include "host/TAddToVectorCallback.h"
 #include "tests/engine/TEngineFixture.h"
 #include "tests/support/Dump.h"
-#include "tests/support/TWatchedClass.h"
-#include "tests/support/TWatchedInstance.h"
-#include "tests/support/TWatchedNamespace.h"
+#include "tests/support/watched/TWatchedClass.h"
+#include "tests/support/watched/TWatchedInstance.h"
+#include "tests/support/watched/TWatchedNamespace.h"
 
 namespace NORVZEL20 {
 namespace {

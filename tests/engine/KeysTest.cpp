@@ -2,10 +2,10 @@
 #include <boost/smart_ptr/make_shared.hpp>
 #include <list>
 
-#include "embedded/TAssertionFailure.h"
+#include "embedded/services/TAssertionFailure.h"
 #include "tests/engine/TEngineFixture.h"
-#include "tests/support/TWatchedClass.h"
-#include "tests/support/TWatchedInstance.h"
+#include "tests/support/watched/TWatchedClass.h"
+#include "tests/support/watched/TWatchedInstance.h"
 
 namespace NORVZEL20 {
 namespace {

@@ -1,11 +1,11 @@
 #include <boost/smart_ptr/make_shared.hpp>
 #include <functional>
 
-#include "embedded/TAssertionFailure.h"
+#include "embedded/services/TAssertionFailure.h"
 #include "tests/engine/TAnsweringNamespace.h"
 #include "tests/engine/TPerClassFixture.h"
-#include "tests/support/TWatchedClass.h"
-#include "tests/support/TWatchedInstance.h"
+#include "tests/support/watched/TWatchedClass.h"
+#include "tests/support/watched/TWatchedInstance.h"
 
 namespace NORVZEL20 {
 namespace {

@@ -3,7 +3,7 @@
 
 #include "host/TZELException.h"
 #include "tests/engine/TPerClassFixture.h"
-#include "tests/support/TWatchedNamespace.h"
+#include "tests/support/watched/TWatchedNamespace.h"
 
 namespace NORVZEL20 {
 namespace {

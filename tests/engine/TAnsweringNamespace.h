@@ -5,7 +5,7 @@
 #include <string>
 #include <utility>
 
-#include "tests/support/TWatchedNamespace.h"
+#include "tests/support/watched/TWatchedNamespace.h"
 
 namespace NORVZEL20 {
 

@@ -1,6 +1,6 @@
 #include "tests/engine/TPerClassFixture.h"
-#include "tests/support/TPlainInstance.h"
-#include "tests/support/TPlainProperty.h"
+#include "tests/support/plain/TPlainInstance.h"
+#include "tests/support/plain/TPlainProperty.h"
 
 namespace NORVZEL20 {
 namespace {

@@ -8,7 +8,7 @@
 #include "tests/faults/TraceRecords.h"
 #include "tests/support/TCapturingLogger.h"
 #include "tests/support/TTestAccess.h"
-#include "tests/support/TWatchedNamespace.h"
+#include "tests/support/watched/TWatchedNamespace.h"
 
 namespace NORVZEL20 {
 namespace {

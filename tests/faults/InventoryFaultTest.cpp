@@ -6,7 +6,7 @@
 #include <iostream>
 #include <stdexcept>
 
-#include "embedded/TCimXmlPopulator.h"
+#include "embedded/cimxml/TCimXmlPopulator.h"
 #include "host/TNamespacePopulator.h"
 #include "tests/faults/FailEachAllocation.h"
 #include "tests/faults/TFaultyStream.h"

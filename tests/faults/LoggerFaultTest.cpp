@@ -3,7 +3,7 @@
 
 #include <cstdio>
 
-#include "embedded/TSpdLogger.h"
+#include "embedded/services/TSpdLogger.h"
 #include "tests/faults/FailEachAllocation.h"
 
 namespace NORVZEL20 {

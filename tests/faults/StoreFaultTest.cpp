@@ -2,8 +2,8 @@
 
 #include <boost/smart_ptr/make_shared.hpp>
 
-#include "embedded/TInMemProperty.h"
-#include "embedded/TInMemQualifier.h"
+#include "embedded/store/TInMemProperty.h"
+#include "embedded/store/TInMemQualifier.h"
 #include "tests/faults/FailEachAllocation.h"
 #include "tests/support/Dump.h"
 #include "tests/support/TComparisonRun.h"

@@ -1,6 +1,6 @@
 #include <gtest/gtest.h>
 
-#include "embedded/TCimXmlWriter.h"
+#include "embedded/cimxml/TCimXmlWriter.h"
 #include "host/TZELException.h"
 #include "tests/faults/DifferingNamespaces.h"
 #include "tests/faults/FailEachAllocation.h"

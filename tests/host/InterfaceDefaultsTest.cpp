@@ -1,7 +1,7 @@
 #include <gtest/gtest.h>
 
 #include "tests/support/TComparisonRun.h"
-#include "tests/support/TPlainQualifier.h"
+#include "tests/support/plain/TPlainQualifier.h"
 
 namespace NORVZEL20 {
 namespace {

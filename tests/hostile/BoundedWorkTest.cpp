@@ -1,7 +1,7 @@
 // Documents that never end: how much of them is read, and how much memory that takes, is counted.
 #include <gmock/gmock.h>
 
-#include "embedded/TCimXmlPopulator.h"
+#include "embedded/cimxml/TCimXmlPopulator.h"
 #include "fuzz/SampleInventory.h"
 #include "tests/hostile/TGeneratedText.h"
 #include "tests/hostile/TMemoryMeter.h"

@@ -3,8 +3,8 @@
 
 #include <algorithm>
 
-#include "embedded/TCimXmlPopulator.h"
-#include "embedded/TInMemNamespace.h"
+#include "embedded/cimxml/TCimXmlPopulator.h"
+#include "embedded/store/TInMemNamespace.h"
 #include "tests/hostile/Repeat.h"
 #include "tests/hostile/TMemoryMeter.h"
 

@@ -1,9 +1,9 @@
 // Documents that would have the loader do the same again and again: its steps are counted.
 #include <gtest/gtest.h>
 
-#include "embedded/EraseLast.h"
-#include "embedded/TCimXmlLoader.h"
-#include "embedded/TXmlReader.h"
+#include "embedded/cimxml/TCimXmlLoader.h"
+#include "embedded/cimxml/TXmlReader.h"
+#include "embedded/value/EraseLast.h"
 
 namespace NORVZEL20 {
 

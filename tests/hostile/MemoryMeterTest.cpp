@@ -7,7 +7,7 @@
 #include <functional>
 #include <memory>
 
-#include "embedded/TCimXmlPopulator.h"
+#include "embedded/cimxml/TCimXmlPopulator.h"
 #include "fuzz/SampleInventory.h"
 #include "tests/hostile/TMemoryMeter.h"
 

@@ -1,6 +1,6 @@
 // Elements, attributes and names beyond any measure.
-#include "embedded/TCimXmlPopulator.h"
-#include "embedded/TInMemNamespace.h"
+#include "embedded/cimxml/TCimXmlPopulator.h"
+#include "embedded/store/TInMemNamespace.h"
 #include "tests/hostile/HostileRow.h"
 #include "tests/hostile/Repeat.h"
 

@@ -5,7 +5,7 @@
 #include <set>
 #include <stdexcept>
 
-#include "embedded/TCimXmlPopulator.h"
+#include "embedded/cimxml/TCimXmlPopulator.h"
 #include "fuzz/SampleInventory.h"
 #include "tests/hostile/TGeneratedText.h"
 #include "tests/hostile/TMemoryMeter.h"

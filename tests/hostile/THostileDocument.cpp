@@ -2,7 +2,7 @@
 
 #include <map>
 
-#include "embedded/TCimXmlPopulator.h"
+#include "embedded/cimxml/TCimXmlPopulator.h"
 #include "fuzz/SampleInventory.h"
 #include "fuzz/TLogRecorder.h"
 #include "host/TXmlParser.h"

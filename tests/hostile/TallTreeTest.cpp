@@ -1,7 +1,7 @@
 // A class tree as tall as one may be, compared under rules: everything that goes down the tree does so recursively.
 #include <gtest/gtest.h>
 
-#include "embedded/TCimXmlPopulator.h"
+#include "embedded/cimxml/TCimXmlPopulator.h"
 #include "tests/hostile/TMemoryMeter.h"
 #include "tests/support/TComparisonRun.h"
 

@@ -3,8 +3,8 @@
 
 #include <boost/smart_ptr/make_shared.hpp>
 
-#include "embedded/TEmbeddedObject.h"
-#include "embedded/TLikePattern.h"
+#include "embedded/query/TLikePattern.h"
+#include "embedded/value/TEmbeddedObject.h"
 #include "tests/hostile/TMemoryMeter.h"
 
 namespace NORVZEL20 {

@@ -7,7 +7,7 @@
 #include <stdexcept>
 #include <vector>
 
-#include "client/TInventoryFile.h"
+#include "client/inventory/TInventoryFile.h"
 
 namespace NORVZEL20 {
 namespace {

@@ -9,11 +9,11 @@
 #include <fstream>
 #include <stdexcept>
 
-#include "client/TInventoryFile.h"
-#include "embedded/TCimXmlPopulator.h"
-#include "embedded/TCimXmlWriter.h"
-#include "embedded/TInMemInstance.h"
-#include "embedded/TInMemProperty.h"
+#include "client/inventory/TInventoryFile.h"
+#include "embedded/cimxml/TCimXmlPopulator.h"
+#include "embedded/cimxml/TCimXmlWriter.h"
+#include "embedded/store/TInMemInstance.h"
+#include "embedded/store/TInMemProperty.h"
 #include "host/TNamespaceProviderManager.h"
 
 namespace NORVZEL20 {

@@ -5,7 +5,7 @@
 #include <string>
 #include <vector>
 
-#include "embedded/TInMemNamespace.h"
+#include "embedded/store/TInMemNamespace.h"
 #include "provider/TDeltaNamespace.h"
 
 namespace NORVZEL20 {

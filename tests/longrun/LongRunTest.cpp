@@ -2,7 +2,7 @@
 
 #include <iostream>
 
-#include "embedded/TCoreLog.h"
+#include "embedded/services/TCoreLog.h"
 #include "tests/faults/LeakCheck.h"
 #include "tests/faults/TFailingAllocator.h"
 #include "tests/faults/TraceRecords.h"

@@ -4,8 +4,8 @@
 #include "provider/TDeltaClass.h"
 #include "tests/provider/TAnsweringClass.h"
 #include "tests/provider/TDeltaFixture.h"
-#include "tests/support/TPlainNamespace.h"
-#include "tests/support/TPlainQualifier.h"
+#include "tests/support/plain/TPlainNamespace.h"
+#include "tests/support/plain/TPlainQualifier.h"
 
 namespace NORVZEL20 {
 namespace {

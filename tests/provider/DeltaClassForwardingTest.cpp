@@ -2,8 +2,8 @@
 
 #include "provider/TDeltaClass.h"
 #include "tests/provider/TDeltaFixture.h"
-#include "tests/support/TPlainQualifier.h"
 #include "tests/support/TTestAccess.h"
+#include "tests/support/plain/TPlainQualifier.h"
 
 namespace NORVZEL20 {
 namespace {

@@ -4,10 +4,10 @@
 #include "provider/TDeltaClass.h"
 #include "provider/TDeltaNamespaceProvider.h"
 #include "tests/provider/TDeltaFixture.h"
-#include "tests/support/TPlainClass.h"
-#include "tests/support/TPlainNamespace.h"
 #include "tests/support/TTestAccess.h"
-#include "tests/support/TWatchedNamespace.h"
+#include "tests/support/plain/TPlainClass.h"
+#include "tests/support/plain/TPlainNamespace.h"
+#include "tests/support/watched/TWatchedNamespace.h"
 
 namespace NORVZEL20 {
 namespace {

@@ -8,8 +8,8 @@
 #include "provider/TDeltaNamespaceProvider.h"
 #include "tests/provider/TDeltaFixture.h"
 #include "tests/support/TTestAccess.h"
-#include "tests/support/TWatchedClass.h"
-#include "tests/support/TWatchedNamespace.h"
+#include "tests/support/watched/TWatchedClass.h"
+#include "tests/support/watched/TWatchedNamespace.h"
 
 namespace NORVZEL20 {
 namespace {

@@ -5,7 +5,7 @@
 #include "host/TZELException.h"
 #include "tests/provider/TDeltaFixture.h"
 #include "tests/support/TTestAccess.h"
-#include "tests/support/TWatchedNamespace.h"
+#include "tests/support/watched/TWatchedNamespace.h"
 
 namespace NORVZEL20 {
 namespace {

@@ -11,8 +11,8 @@
 #include "provider/TDeltaNamespaceProvider.h"
 #include "tests/provider/TDeltaFixture.h"
 #include "tests/support/CallText.h"
-#include "tests/support/TPlainNamespace.h"
 #include "tests/support/TTestAccess.h"
+#include "tests/support/plain/TPlainNamespace.h"
 
 // This program's own versions of some operations of the host stand in front of the library's, so that tests see each call and
 // have it answer what they want. The library asks for the manager before this program's objects are made: flags and pointers only.

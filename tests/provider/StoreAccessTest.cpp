@@ -4,7 +4,7 @@
 #include "tests/provider/TDeltaFixture.h"
 #include "tests/support/Dump.h"
 #include "tests/support/TTestAccess.h"
-#include "tests/support/TWatchedNamespace.h"
+#include "tests/support/watched/TWatchedNamespace.h"
 
 namespace NORVZEL20 {
 namespace {

@@ -2,7 +2,7 @@
 
 #include <string>
 
-#include "tests/support/TPlainClass.h"
+#include "tests/support/plain/TPlainClass.h"
 
 namespace NORVZEL20 {
 

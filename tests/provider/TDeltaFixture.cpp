@@ -1,6 +1,6 @@
 #include "tests/provider/TDeltaFixture.h"
 
-#include "embedded/TAssertionFailure.h"
+#include "embedded/services/TAssertionFailure.h"
 #include "host/TZELException.h"
 
 namespace NORVZEL20 {

@@ -3,7 +3,7 @@
 #include <boost/smart_ptr/make_shared.hpp>
 #include <sstream>
 
-#include "embedded/TAssertionFailure.h"
+#include "embedded/services/TAssertionFailure.h"
 #include "spec/TDiffClassRules.h"
 #include "tests/support/Dump.h"
 #include "tests/support/TCapturingLogger.h"

@@ -2,13 +2,13 @@
 
 #include <boost/smart_ptr/make_shared.hpp>
 
-#include "embedded/TAssertionFailure.h"
+#include "embedded/services/TAssertionFailure.h"
 #include "host/TZELException.h"
 #include "spec/TDiffClassRules.h"
 #include "tests/support/Dump.h"
 #include "tests/support/TCapturingLogger.h"
 #include "tests/support/TComparisonRun.h"
-#include "tests/support/TWatchedNamespace.h"
+#include "tests/support/watched/TWatchedNamespace.h"
 
 namespace NORVZEL20 {
 namespace {

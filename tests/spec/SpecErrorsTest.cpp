@@ -2,11 +2,11 @@
 #include <stdexcept>
 #include <typeinfo>
 
-#include "embedded/TAssertionFailure.h"
+#include "embedded/services/TAssertionFailure.h"
 #include "host/TZELException.h"
 #include "spec/TDiffXMLParser.h"
 #include "tests/spec/TSpecFixture.h"
-#include "tests/support/TWatchedNamespace.h"
+#include "tests/support/watched/TWatchedNamespace.h"
 
 namespace NORVZEL20 {
 namespace {

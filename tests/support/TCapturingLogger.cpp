@@ -1,6 +1,6 @@
 #include "tests/support/TCapturingLogger.h"
 
-#include "embedded/TCoreLog.h"
+#include "embedded/services/TCoreLog.h"
 
 namespace NORVZEL20 {
 

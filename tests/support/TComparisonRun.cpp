@@ -7,9 +7,9 @@
 #include "host/TZELException.h"
 #include "provider/TDeltaNamespaceProvider.h"
 #include "tests/support/Dump.h"
-#include "tests/support/TPlainNamespace.h"
 #include "tests/support/TTestAccess.h"
-#include "tests/support/TWatchedNamespace.h"
+#include "tests/support/plain/TPlainNamespace.h"
+#include "tests/support/watched/TWatchedNamespace.h"
 
 namespace NORVZEL20 {
 

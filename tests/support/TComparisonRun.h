@@ -7,9 +7,9 @@
 #include <vector>
 
 #include "provider/TDeltaNamespace.h"
-#include "tests/support/TCallWatch.h"
 #include "tests/support/TNamespaceBuilder.h"
 #include "tests/support/TScratchFile.h"
+#include "tests/support/watched/TCallWatch.h"
 
 namespace NORVZEL20 {
 

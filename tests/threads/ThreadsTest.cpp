@@ -6,8 +6,8 @@
 #include <mutex>
 #include <thread>
 
-#include "embedded/TCimXmlPopulator.h"
-#include "embedded/TCoreLog.h"
+#include "embedded/cimxml/TCimXmlPopulator.h"
+#include "embedded/services/TCoreLog.h"
 #include "host/TZELException.h"
 #include "tests/faults/DifferingNamespaces.h"
 #include "tests/support/Dump.h"

@@ -1,7 +1,7 @@
 #include <boost/smart_ptr/shared_ptr.hpp>
 #include <iostream>
 
-#include "embedded/TInMemNamespace.h"
+#include "embedded/store/TInMemNamespace.h"
 #include "host/TNamespaceProviderManager.h"
 #include "host/TOSSpecific.h"
 #include "host/TZELException.h"

@@ -1,0 +1,37 @@
+#include "client/commands/CompareCommand.h"
+
+#include "client/comparison/TComparison.h"
+#include "client/inventory/TInventoryLoader.h"
+#include "client/report/CimXmlFormat.h"
+#include "client/report/JsonFormat.h"
+#include "client/report/ResultOutput.h"
+#include "client/report/TTextFormat.h"
+
+namespace NORVZEL20 {
+
+namespace {
+
+std::string Write(const TComparisonReport& report, const std::string& format, bool colored)
+{
+    if (format == "json") {
+        return WriteJsonReport(report);
+    }
+    if (format == "ndjson") {
+        return WriteNdjsonReport(report);
+    }
+    return format == "cimxml" ? WriteCimXmlReport(report) : TTextFormat(report, colored).Write();
+}
+
+}  // namespace
+
+int RunCompare(const TCompareOptions& options, IConsole& console)
+{
+    std::vector<std::string> paths(1, options.reference);
+    paths.insert(paths.end(), options.others.begin(), options.others.end());
+    std::vector<TInventory> inventories = TInventoryLoader(console).Load(paths);
+    const TComparisonReport report = TComparison(inventories, console).Run(options.rules, options.strictSchema);
+    DeliverResult(console, options.output, Write(report, options.format, console.IsColored() && IsStandardOutput(options.output)));
+    return report.differences.empty() ? 0 : 1;
+}
+
+}  // namespace NORVZEL20

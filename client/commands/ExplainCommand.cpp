@@ -1,0 +1,23 @@
+#include "client/commands/ExplainCommand.h"
+
+#include "client/inventory/CompleteInventories.h"
+#include "client/inventory/TInventoryLoader.h"
+#include "client/report/ResultOutput.h"
+#include "client/report/TRulesListing.h"
+
+namespace NORVZEL20 {
+
+int RunExplain(const TExplainOptions& options, IConsole& console)
+{
+    std::vector<TInventory> inventories = TInventoryLoader(console).Load(options.schemas);
+    CompleteInventories(inventories, console);
+    TRulesListing listing(options.rules, inventories.front());
+    const std::size_t dot = options.element.find('.');
+    DeliverResult(console, options.output,
+                  dot == std::string::npos
+                      ? listing.WriteExplanation(options.element)
+                      : listing.WriteExplanation(options.element.substr(0, dot), options.element.substr(dot + 1)));
+    return 0;
+}
+
+}  // namespace NORVZEL20

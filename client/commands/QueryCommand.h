@@ -1,0 +1,20 @@
+#pragma once
+
+#include <string>
+
+#include "client/process/IConsole.h"
+
+namespace NORVZEL20 {
+
+/// What `cimdelta query` was asked.
+struct TQueryOptions {
+    std::string query;
+    std::string inventory;
+    std::string format = "text";  ///< text, json, ndjson or cimxml
+    std::string output;           ///< empty: standard output
+};
+
+/// Writes the instances of an inventory that answer a query in WQL. Returns 0. Errors: TClientError.
+int RunQuery(const TQueryOptions& options, IConsole& console);
+
+}  // namespace NORVZEL20

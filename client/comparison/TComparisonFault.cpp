@@ -1,0 +1,125 @@
+#include "client/comparison/TComparisonFault.h"
+
+#include "client/inventory/CimWalk.h"
+#include "client/inventory/OperatingSystem.h"
+#include "client/text/TypeName.h"
+#include "host/TZELException.h"
+
+namespace NORVZEL20 {
+
+namespace {
+
+std::string Name(const ICIMClass& cls)
+{
+    return cls.GetName(TCallContext());
+}
+
+// Whether the first instance has what the plug-in reads of it.
+bool HasUsableType(TInMemClass& systems)
+{
+    try {
+        const unsigned short type = InstancesOf(systems).at(0)->GetProperty("OSType", TCallContext())->GetValue(TCallContext());
+        static_cast<void>(type);
+        return true;
+    } catch (const TZELException&) {
+        return false;
+    }
+}
+
+// The reason of status 3: the first inventory that does not hold what the plug-in asks every inventory for.
+std::string FindSystemTrouble(const std::vector<TInventory>& inventories)
+{
+    for (const TInventory& inventory : inventories) {
+        if (!inventory.ns->FindClass(kOperatingSystemClass)) {
+            return inventory.path + " declares no class " + kOperatingSystemClass;
+        }
+    }
+    const boost::shared_ptr<TInMemClass> systems = inventories[0].ns->FindClass(kOperatingSystemClass);
+    if (systems->GetInstanceCount() == 0) {
+        return inventories[0].path + " has no instance of " + kOperatingSystemClass;
+    }
+    if (HasUsableType(*systems)) {
+        return "the inventories are as they should be; perhaps there was not enough memory";
+    }
+    return "the first " + std::string(kOperatingSystemClass) + " of " + inventories[0].path + " has no OSType between 0 and 65535";
+}
+
+// The reason of status 37.
+std::string FindUndeclaredClass(const TInventory& reference, const TInventory& other, TInMemClass& cls,
+                                const std::vector<std::string>&)
+{
+    return cls.GetInstanceCount() > 0 && !other.ns->FindClass(cls.GetName())
+               ? other.path + " does not declare class " + cls.GetName() + ", of which " + reference.path + " has instances"
+               : std::string();
+}
+
+// The reason of status 15.
+std::string FindUndeclaredProperty(const TInventory&, const TInventory& other, TInMemClass& cls,
+                                   const std::vector<std::string>& properties)
+{
+    const boost::shared_ptr<TInMemClass> there = other.ns->FindClass(cls.GetName());
+    for (const std::string& property : properties) {
+        if (there && there->GetInstanceCount() > 0 && !there->FindPropertyDecl(property)) {
+            return other.path + " does not declare property " + property + " of class " + cls.GetName();
+        }
+    }
+    return std::string();
+}
+
+// The reason of status 13.
+std::string FindOtherType(const TInventory& reference, const TInventory& other, TInMemClass& cls, const std::vector<std::string>&)
+{
+    const boost::shared_ptr<TInMemClass> there = other.ns->FindClass(cls.GetName());
+    for (const std::uint32_t slot : cls.GetSlotOrder()) {
+        const TInMemPropertyDecl& property = cls.GetSlotDecl(slot);
+        const boost::shared_ptr<TInMemPropertyDecl> counterpart = there ? there->FindPropertyDecl(property.GetName()) : nullptr;
+        if (counterpart && counterpart->GetType() != property.GetType()) {
+            return "property " + property.GetName() + " of class " + cls.GetName() + " is " + TypeName(property.GetType()) +
+                   " in " + reference.path + " and " + TypeName(counterpart->GetType()) + " in " + other.path;
+        }
+    }
+    return std::string();
+}
+
+// The first trouble in the order of the reference's classes that are compared.
+template <class TFind>
+std::string FindFirst(const std::vector<TInventory>& inventories, TRules& rules, TFind find)
+{
+    for (const boost::shared_ptr<ICIMClass>& cls : AllClassesOf(*inventories[0].ns)) {
+        const std::vector<std::string> properties = rules.PropertiesOf(cls);
+        for (std::size_t i = 1; i < inventories.size() && !properties.empty(); ++i) {
+            const std::string trouble = find(inventories[0], inventories[i], *inventories[0].ns->FindClass(Name(*cls)), properties);
+            if (!trouble.empty()) {
+                return trouble;
+            }
+        }
+    }
+    return std::string();
+}
+
+}  // namespace
+
+std::string TComparisonFault::Describe(const std::vector<TInventory>& inventories, TRules& rules) const
+{
+    std::string trouble;
+    switch (status.GetStatus()) {
+    case TZELStatusCode::kInitializationFailed:
+        trouble = FindSystemTrouble(inventories);
+        break;
+    case TZELStatusCode::kTypeMismatch:
+        trouble = FindFirst(inventories, rules, FindOtherType);
+        break;
+    case TZELStatusCode::kNotFound:
+        trouble = FindFirst(inventories, rules, FindUndeclaredProperty);
+        break;
+    case TZELStatusCode::kSchemaMismatch:
+        trouble = FindFirst(inventories, rules, FindUndeclaredClass);
+        break;
+    default:
+        break;
+    }
+    return "the comparison failed: " + (log.empty() ? reason : log.back()) + (trouble.empty() ? "" : "; " + trouble) +
+           (strictSchema ? "; without --strict-schema, cimdelta declares and makes what is missing" : "");
+}
+
+}  // namespace NORVZEL20

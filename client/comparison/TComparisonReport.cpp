@@ -1,0 +1,28 @@
+#include "client/comparison/TComparisonReport.h"
+
+namespace NORVZEL20 {
+
+TComparisonReport::TCounts TComparisonReport::Count() const
+{
+    TCounts counts;
+    const TDifference* previous = nullptr;
+    for (const TDifference& difference : differences) {
+        switch (difference.kind) {
+        case TDifference::kOnlyInReference:
+            ++counts.onlyInReference;
+            break;
+        case TDifference::kOnlyInOthers:
+            ++counts.onlyInOthers;
+            break;
+        case TDifference::kChanged:
+            ++counts.changedValues;
+            if (previous == nullptr || previous->kind != TDifference::kChanged || previous->instance != difference.instance) {
+                ++counts.changedInstances;
+            }
+        }
+        previous = &difference;
+    }
+    return counts;
+}
+
+}  // namespace NORVZEL20

@@ -1,0 +1,160 @@
+#include "client/comparison/TDifferenceReader.h"
+
+#include <algorithm>
+#include <tuple>
+
+#include "client/inventory/CimWalk.h"
+#include "embedded/store/TInMemProperty.h"
+
+namespace NORVZEL20 {
+
+namespace {
+
+// A comparison of two inventories has given the reference the other one's values; it remembers what it held.
+TCIMValue ValueBefore(const ICIMInstance& instance, const std::string& property)
+{
+    const boost::shared_ptr<ICIMProperty> handle = instance.GetProperty(property, TCallContext());
+    const TInMemProperty* stored = dynamic_cast<const TInMemProperty*>(handle.get());
+    const TCIMValue* earlier = stored == nullptr ? nullptr : stored->GetEarlierValue();
+    return earlier == nullptr ? handle->GetValue(TCallContext()) : *earlier;
+}
+
+// What looks alike to a person, too: instants that are equal may be written with other offsets.
+bool LookEqual(const TCIMValue& a, const TCIMValue& b)
+{
+    return a == b && a.ToText() == b.ToText();
+}
+
+void AddToGroups(std::vector<TDifference::TGroup>& groups, std::size_t inventory, const TCIMValue& value)
+{
+    for (TDifference::TGroup& group : groups) {
+        if (LookEqual(group.value, value)) {
+            if (group.inventories.back() != inventory) {
+                group.inventories.push_back(inventory);
+            }
+            return;
+        }
+    }
+    groups.push_back({{inventory}, value});
+}
+
+bool StandsBefore(const TDifference& a, const TDifference& b)
+{
+    return std::tie(a.className, a.instance, a.kind, a.property) < std::tie(b.className, b.instance, b.kind, b.property);
+}
+
+}  // namespace
+
+std::vector<TDifference> TDifferenceReader::Read(TDeltaNamespace& records)
+{
+    std::vector<TDifference> differences;
+    for (const auto& ofClass : ReadDeltaRecords(records)) {
+        StartClass(ofClass.first);
+        for (const TDeltaRecord& record : ofClass.second) {
+            differences.push_back(Make(record));
+        }
+    }
+    std::sort(differences.begin(), differences.end(), StandsBefore);
+    return differences;
+}
+
+void TDifferenceReader::StartClass(const std::string& className)
+{
+    fClassName = className;
+    fIndexes.clear();
+    fIndexes.resize(fInventories.size());
+    fByPath.clear();
+    const std::vector<std::string>& excluded = fRules.ExcludedKeysOf(className);
+    fKeyNames = KeyNamesOf(*fInventories[0].ns->GetClass(className, TCallContext()));
+    fKeyNames.erase(std::remove_if(fKeyNames.begin(), fKeyNames.end(),
+                                   [&excluded](const std::string& name) {
+                                       return std::find(excluded.begin(), excluded.end(), name) != excluded.end();
+                                   }),
+                    fKeyNames.end());
+}
+
+TDifference TDifferenceReader::Make(const TDeltaRecord& record)
+{
+    TDifference difference;
+    difference.className = fClassName;
+    difference.instance = record.instanceName;
+    difference.property = record.property;
+    difference.inventories = record.inventories;
+    boost::shared_ptr<ICIMInstance> instance;
+    switch (record.type) {
+    case TDeltaNamespace::kInstanceRemoved:
+        difference.kind = TDifference::kOnlyInReference;
+        instance = FindByPath(record.instanceName);
+        difference.instance = fRules.KeyOf(fClassName, instance);
+        break;
+    case TDeltaNamespace::kInstanceAdded:
+        difference.kind = TDifference::kOnlyInOthers;
+        instance = Index(difference.inventories.front()).Find(record.instanceName).at(0);
+        break;
+    case TDeltaNamespace::kPropertyChanged:
+        difference.kind = TDifference::kChanged;
+        instance = Index(0).Find(record.instanceName).at(0);
+        difference.reference = ValueBefore(*instance, record.property);
+        AddValues(difference);
+        break;
+    }
+    AddKeys(difference, *instance);
+    return difference;
+}
+
+// With excluded keys the record names an instance that is missing elsewhere by its own path, else by its key.
+boost::shared_ptr<ICIMInstance> TDifferenceReader::FindByPath(const std::string& path)
+{
+    if (fRules.ExcludedKeysOf(fClassName).empty()) {
+        return Index(0).Find(path).at(0);
+    }
+    if (fByPath.empty()) {
+        for (const boost::shared_ptr<ICIMInstance>& instance :
+             InstancesOf(*fInventories[0].ns->GetClass(fClassName, TCallContext()))) {
+            fByPath[instance->GetReference(TCallContext()).GetPath()] = instance;
+        }
+    }
+    return fByPath.at(path);
+}
+
+const TInstanceIndex& TDifferenceReader::Index(std::size_t inventory)
+{
+    std::unique_ptr<TInstanceIndex>& index = fIndexes.at(inventory);
+    if (!index) {
+        index = std::make_unique<TInstanceIndex>(*fInventories[inventory].ns, fClassName, fRules);
+    }
+    return *index;
+}
+
+void TDifferenceReader::AddKeys(TDifference& difference, const ICIMInstance& instance) const
+{
+    for (const std::string& name : fKeyNames) {
+        difference.keys.push_back({name, ValueBefore(instance, name)});
+    }
+}
+
+void TDifferenceReader::AddValues(TDifference& difference)
+{
+    for (const std::size_t inventory : difference.inventories) {
+        for (const TCIMValue& value : OtherValues(difference, inventory)) {
+            AddToGroups(difference.others, inventory, value);
+        }
+    }
+}
+
+// One value, save where excluded keys make several instances share the key: then all that are not the reference's.
+std::vector<TCIMValue> TDifferenceReader::OtherValues(const TDifference& difference, std::size_t inventory)
+{
+    std::vector<TCIMValue> values;
+    for (const boost::shared_ptr<ICIMInstance>& instance : Index(inventory).Find(difference.instance)) {
+        values.push_back(instance->GetProperty(difference.property, TCallContext())->GetValue(TCallContext()));
+    }
+    if (values.size() > 1) {
+        values.erase(std::remove_if(values.begin(), values.end(),
+                                    [&](const TCIMValue& value) { return LookEqual(value, difference.reference); }),
+                     values.end());
+    }
+    return values;
+}
+
+}  // namespace NORVZEL20

@@ -1,0 +1,41 @@
+#pragma once
+
+#include <memory>
+#include <string>
+#include <vector>
+
+#include "client/comparison/DeltaRecords.h"
+#include "client/comparison/TDifference.h"
+#include "client/comparison/TInstanceIndex.h"
+#include "client/inventory/TInventory.h"
+#include "client/rules/TRules.h"
+
+namespace NORVZEL20 {
+
+/// Turns the records of a run into differences with their values, which the records do not hold.
+class TDifferenceReader {
+  public:
+    /// Everything must outlive this. The inventories are those of the run, in its order.
+    TDifferenceReader(const std::vector<TInventory>& inventories, TRules& rules) : fInventories(inventories), fRules(rules) {}
+
+    /// The differences of all records, by class name, then instance, then property.
+    std::vector<TDifference> Read(TDeltaNamespace& records);
+
+  private:
+    void StartClass(const std::string& className);
+    TDifference Make(const TDeltaRecord& record);
+    boost::shared_ptr<ICIMInstance> FindByPath(const std::string& path);
+    const TInstanceIndex& Index(std::size_t inventory);
+    void AddKeys(TDifference& difference, const ICIMInstance& instance) const;
+    void AddValues(TDifference& difference);
+    std::vector<TCIMValue> OtherValues(const TDifference& difference, std::size_t inventory);
+
+    const std::vector<TInventory>& fInventories;
+    TRules& fRules;
+    std::string fClassName;
+    std::vector<std::string> fKeyNames;                                        // those that count, of the class being read
+    std::vector<std::unique_ptr<TInstanceIndex>> fIndexes;                     // of the class being read, made when first needed
+    std::unordered_map<std::string, boost::shared_ptr<ICIMInstance>> fByPath;  // the reference's instances of that class
+};
+
+}  // namespace NORVZEL20

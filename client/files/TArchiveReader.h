@@ -1,0 +1,40 @@
+#pragma once
+
+#include <exception>
+#include <memory>
+#include <string>
+#include <vector>
+
+#include "client/files/IByteSource.h"
+
+struct archive;
+
+namespace NORVZEL20 {
+
+/// What xz or zstd compressed, of one stream or several in a row, verified by the checksums that they hold.
+class TArchiveReader : public IByteSource {
+  public:
+    /// `compressed` must outlive this and begin as data of `kind` ("xz" or "zstd") does; messages call it `name`.
+    /// Errors: as of Read.
+    TArchiveReader(IByteSource& compressed, const std::string& name, const std::string& kind);
+    TArchiveReader(const TArchiveReader&) = delete;
+    TArchiveReader& operator=(const TArchiveReader&) = delete;
+    ~TArchiveReader() override = default;
+
+    std::size_t Read(char* buffer, std::size_t size) override;
+
+  private:
+    static long Fill(archive* reader, void* self, const void** block);
+    void Open();
+    [[noreturn]] void Fail() const;
+
+    IByteSource& fCompressed;
+    std::string fName;
+    std::string fKind;
+    std::vector<char> fBlock;
+    std::exception_ptr fFault;  // of fCompressed, on its way past the C library
+    std::unique_ptr<archive, int (*)(archive*)> fArchive;
+    bool fEmpty = false;
+};
+
+}  // namespace NORVZEL20

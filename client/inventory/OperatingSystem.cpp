@@ -1,0 +1,237 @@
+#include "client/inventory/OperatingSystem.h"
+
+#include <algorithm>
+
+#include "client/inventory/CimWalk.h"
+#include "client/process/TClientError.h"
+#include "client/text/TypeName.h"
+#include "embedded/store/TSchemaCopier.h"
+#include "host/TCIMDateTime.h"
+#include "host/TZELException.h"
+
+namespace NORVZEL20 {
+
+const char* const kOperatingSystemClass = "KALMO_OperatingSystem";
+
+namespace {
+
+const char kStandardClass[] = "CIM_OperatingSystem";
+const char kTypeProperty[] = "OSType";
+const char kNameProperty[] = "Name";
+const char kKeyQualifier[] = "Key";
+
+// What the new instance tells about the system.
+struct TSystem {
+    TCIMValue name = TCIMValue("unknown");
+    std::uint64_t type = 0;
+};
+
+TCIMValue FindValue(const ICIMInstance& instance, const char* property)
+{
+    return FindPropertyDecl(*instance.GetClass(TCallContext()), property)
+               ? instance.GetProperty(property, TCallContext())->GetValue(TCallContext())
+               : TCIMValue();
+}
+
+// Of several instances the one whose path comes first, so that the order in the file does not matter.
+boost::shared_ptr<ICIMInstance> FindStandardInstance(TInMemNamespace& ns)
+{
+    boost::shared_ptr<ICIMInstance> first;
+    if (const boost::shared_ptr<TInMemClass> cls = ns.FindClass(kStandardClass)) {
+        std::string firstPath;
+        cls->EnumerateInstances(
+            [&](boost::shared_ptr<ICIMInstance> instance) {
+                const std::string path = instance->GetReference(TCallContext()).GetPath();
+                if (!first || path < firstPath) {
+                    first = instance;
+                    firstPath = path;
+                }
+                return true;
+            },
+            true, TCallContext());
+    }
+    return first;
+}
+
+TSystem Describe(TInMemNamespace& ns)
+{
+    TSystem system;
+    const boost::shared_ptr<ICIMInstance> instance = FindStandardInstance(ns);
+    if (!instance) {
+        return system;
+    }
+    const TCIMValue name = FindValue(*instance, kNameProperty);
+    if (!name.IsNull() && name.GetType() == TCIMValue::TCIMType::kString) {
+        system.name = name;
+    }
+    const TCIMValue type = FindValue(*instance, kTypeProperty);
+    if (!type.IsNull() && type.GetType() == TCIMValue::TCIMType::kUint16) {
+        system.type = type.GetUnsigned();
+    }
+    return system;
+}
+
+void AddProperty(TInMemNamespace& ns, TInMemClass& cls, const char* name, TCIMValue::TCIMType type, bool isKey)
+{
+    const boost::shared_ptr<ICIMPropertyDecl> decl = cls.AllocatePropertyDecl(name, TCIMValue::Null(type), TCallContext());
+    if (isKey) {
+        if (!ns.FindQualifierDecl(kKeyQualifier)) {
+            ns.AllocateQualifierDecl(
+                kKeyQualifier, TCIMValue(false),
+                ICIMQualifierDecl::EScope(ICIMQualifierDecl::kScopeProperty | ICIMQualifierDecl::kScopeReference),
+                ICIMQualifierDecl::kFlavorToSubclass, TCallContext());
+        }
+        const boost::shared_ptr<const ICIMQualifierDecl> key = ns.FindQualifierDecl(kKeyQualifier);
+        decl->AddQualifier(decl->AllocateQualifier(key, TCIMValue(true), TCallContext()), TCallContext());
+    }
+    cls.AddPropertyDecl(decl);
+}
+
+[[noreturn]] void Refuse(const TInventory& inventory, const std::string& reason)
+{
+    throw TClientError(inventory.path + ": has no instance of " + kOperatingSystemClass +
+                       ", which a comparison needs, and none can be made: " + reason + "; add one to the inventory");
+}
+
+// What a declaration of the class fails on: a property that a superclass there declares with another type.
+std::string DescribeConflict(const TInMemClass& declared, const TInMemNamespace& ns)
+{
+    for (const TInMemClass* cls = &declared; cls != nullptr; cls = cls->GetSuperInMemClass().get()) {
+        const boost::shared_ptr<TInMemClass> super =
+            cls->GetSuperInMemClass() ? ns.FindClass(cls->GetSuperInMemClass()->GetName()) : nullptr;
+        for (const boost::shared_ptr<TInMemPropertyDecl>& own : cls->GetOwnPropertyDecls()) {
+            const boost::shared_ptr<TInMemPropertyDecl> above = super ? super->FindPropertyDecl(own->GetName()) : nullptr;
+            if (above && above->GetType() != own->GetType()) {
+                return "property " + own->GetName() + " of " + cls->GetName() + " is " + TypeName(own->GetType()) + " there, but " +
+                       super->GetName() + " declares it as " + TypeName(above->GetType()) + " here";
+            }
+        }
+    }
+    return "the declarations do not fit together";
+}
+
+boost::shared_ptr<TInMemClass> DeclareAs(const TInventory& source, const TInMemClass& declared, const TInventory& inventory)
+{
+    try {
+        TSchemaCopier(inventory.ns).CopyClass(declared);
+    } catch (const TZELException&) {
+        Refuse(inventory, "the class cannot be declared as in " + source.path + ", " + DescribeConflict(declared, *inventory.ns));
+    }
+    return inventory.ns->FindClass(kOperatingSystemClass);
+}
+
+boost::shared_ptr<TInMemClass> DeclareClass(const std::vector<TInventory>& inventories, const TInventory& inventory)
+{
+    for (const TInventory& other : inventories) {
+        if (const boost::shared_ptr<TInMemClass> declared = other.ns->FindClass(kOperatingSystemClass)) {
+            return DeclareAs(other, *declared, inventory);
+        }
+    }
+    const boost::shared_ptr<TInMemClass> cls =
+        inventory.ns->AllocateInMemClass(kOperatingSystemClass, boost::shared_ptr<TInMemClass>());
+    cls->AddToNamespace(TCallContext());
+    AddProperty(*inventory.ns, *cls, kNameProperty, TCIMValue::TCIMType::kString, true);
+    return cls;
+}
+
+// A value that a key can have, for a class whose keys are another inventory's.
+TCIMValue SomeValue(TCIMValue::TCIMType type, const std::string& className)
+{
+    switch (type) {
+    case TCIMValue::TCIMType::kBoolean:
+        return TCIMValue(false);
+    case TCIMValue::TCIMType::kUint8:
+        return TCIMValue(static_cast<unsigned char>(0));
+    case TCIMValue::TCIMType::kSint8:
+        return TCIMValue(static_cast<signed char>(0));
+    case TCIMValue::TCIMType::kUint16:
+        return TCIMValue(static_cast<unsigned short>(0));
+    case TCIMValue::TCIMType::kSint16:
+        return TCIMValue(static_cast<short>(0));
+    case TCIMValue::TCIMType::kUint32:
+        return TCIMValue(0u);
+    case TCIMValue::TCIMType::kSint32:
+        return TCIMValue(0);
+    case TCIMValue::TCIMType::kUint64:
+        return TCIMValue(0ul);
+    case TCIMValue::TCIMType::kSint64:
+        return TCIMValue(0l);
+    case TCIMValue::TCIMType::kReal32:
+        return TCIMValue(0.0f);
+    case TCIMValue::TCIMType::kReal64:
+        return TCIMValue(0.0);
+    case TCIMValue::TCIMType::kChar16:
+        return TCIMValue(u'?');
+    case TCIMValue::TCIMType::kDateTime:
+        return TCIMValue(TCIMDateTime());
+    case TCIMValue::TCIMType::kReference: {
+        TCIMReference path;
+        path.SetClassName(className);
+        return TCIMValue(path);
+    }
+    default:
+        return TCIMValue("unknown");
+    }
+}
+
+void AddTypeProperty(const TInventory& inventory, TInMemClass& cls)
+{
+    for (const boost::shared_ptr<TInMemClass>& below : cls.GetClassesBelow()) {
+        const boost::shared_ptr<TInMemPropertyDecl> other = below->FindPropertyDecl(kTypeProperty);
+        if (other && other->GetType() != TCIMValue::TCIMType::kUint16) {
+            Refuse(inventory, "property " + other->GetName() + " of " + below->GetName() + " is " + TypeName(other->GetType()) +
+                                  " instead of uint16");
+        }
+    }
+    AddProperty(*inventory.ns, cls, kTypeProperty, TCIMValue::TCIMType::kUint16, false);
+}
+
+void AddInstance(const TInventory& inventory, TInMemClass& cls)
+{
+    TInMemNamespace& ns = *inventory.ns;
+    if (!cls.FindPropertyDecl(kTypeProperty)) {
+        AddTypeProperty(inventory, cls);
+    }
+    const TSystem system = Describe(ns);
+    const boost::shared_ptr<TInMemInstance> instance = cls.AllocateInMemInstance();
+    for (const std::uint32_t slot : cls.GetKeySlots()) {
+        if (cls.GetSlotDecl(slot).GetType().IsArray()) {
+            Refuse(inventory, "its key " + cls.GetSlotDecl(slot).GetName() + " is an array");
+        }
+        instance->SetSlot(slot, SomeValue(cls.GetSlotDecl(slot).GetType(), cls.GetName()));
+    }
+    const std::uint32_t name = cls.FindSlot(kNameProperty);
+    if (name != TInMemClass::kNoSlot && cls.GetSlotDecl(name).GetType() == TCIMValue::TCIMType::kString) {
+        instance->SetSlot(name, system.name);
+    }
+    const std::uint32_t type = cls.FindSlot(kTypeProperty);
+    if (cls.GetSlotDecl(type).GetType() == TCIMValue::TCIMType::kUint16) {
+        instance->SetSlot(type, TCIMValue(static_cast<unsigned short>(system.type)));
+    }
+    instance->AddToNamespace(TCallContext());
+}
+
+}  // namespace
+
+std::vector<TSchemaNote> MakeMissingOperatingSystems(std::vector<TInventory>& inventories)
+{
+    std::vector<TSchemaNote> notes;
+    for (std::size_t i = 0; i < inventories.size(); ++i) {
+        boost::shared_ptr<TInMemClass> cls = inventories[i].ns->FindClass(kOperatingSystemClass);
+        if (cls && cls->GetInstanceCount() > 0) {
+            continue;
+        }
+        if (!cls) {
+            cls = DeclareClass(inventories, inventories[i]);
+        }
+        try {
+            AddInstance(inventories[i], *cls);
+        } catch (const TZELException& error) {
+            Refuse(inventories[i], error.what());
+        }
+        notes.push_back({TSchemaNote::kOperatingSystemMade, i, i, kOperatingSystemClass, std::string(), std::string()});
+    }
+    return notes;
+}
+
+}  // namespace NORVZEL20

@@ -1,0 +1,177 @@
+#include "client/inventory/TSchemaCompletion.h"
+
+#include <algorithm>
+#include <set>
+#include <tuple>
+
+#include "client/process/TClientError.h"
+#include "client/text/TypeName.h"
+#include "embedded/store/TReferenceAdapter.h"
+#include "embedded/store/TSchemaCopier.h"
+#include "embedded/store/TSchemaLimitError.h"
+#include "embedded/value/TNameText.h"
+#include "host/TZELException.h"
+
+namespace NORVZEL20 {
+
+namespace {
+
+std::vector<std::string> KeysInLowerCase(const TInMemClass& cls)
+{
+    std::vector<std::string> keys;
+    for (const std::uint32_t slot : cls.GetKeySlots()) {
+        keys.push_back(TNameText::ToLower(cls.GetSlotDecl(slot).GetName()));
+    }
+    std::sort(keys.begin(), keys.end());
+    return keys;
+}
+
+/// Why a property cannot be declared in `cls`: what declares it otherwise.
+std::string DescribeConflict(const TInMemClass& cls, const TInMemPropertyDecl& property)
+{
+    for (const boost::shared_ptr<TInMemClass>& below : cls.GetClassesBelow()) {
+        const boost::shared_ptr<TInMemPropertyDecl> other = below->FindPropertyDecl(property.GetName());
+        if (other && other->GetType() != property.GetType()) {
+            return "class " + below->GetName() + " below it has one of that name with the type " + TypeName(other->GetType()) +
+                   " instead of " + TypeName(property.GetType());
+        }
+    }
+    return "the declarations do not fit together";
+}
+
+}  // namespace
+
+std::vector<TSchemaNote> TSchemaCompletion::Run()
+{
+    fNotes.clear();
+    for (std::size_t source = 0; source < fInventories.size(); ++source) {
+        // Nothing is declared in the source itself meanwhile, but the list is copied: targets may be the same namespace.
+        const std::vector<boost::shared_ptr<TInMemClass>> classes = fInventories[source].ns->GetClasses();
+        for (const boost::shared_ptr<TInMemClass>& cls : classes) {
+            for (std::size_t target = 0; target < fInventories.size(); ++target) {
+                if (target != source) {
+                    SpreadWithinLimits(source, *cls, target);
+                }
+            }
+        }
+    }
+    AdaptReferences();
+    SortNotes();
+    return fNotes;
+}
+
+void TSchemaCompletion::SpreadWithinLimits(std::size_t source, const TInMemClass& cls, std::size_t target)
+{
+    try {
+        Spread(source, cls, target);
+    } catch (const TSchemaLimitError& error) {
+        throw TClientError(fInventories[target].path + ": class " + cls.GetName() + " of " + fInventories[source].path +
+                           " cannot be declared here: " + error.what());
+    }
+}
+
+void TSchemaCompletion::Spread(std::size_t source, const TInMemClass& cls, std::size_t target)
+{
+    const boost::shared_ptr<TInMemClass> there = fInventories[target].ns->FindClass(cls.GetName());
+    if (!there) {
+        Declare(source, cls, target);
+        return;
+    }
+    if (target > source) {
+        Respell(source, cls, target);
+        if (KeysInLowerCase(cls) != KeysInLowerCase(*there)) {
+            Note(TSchemaNote::kKeysDiffer, target, source, cls.GetName(), std::string());
+        }
+    }
+    for (const std::uint32_t slot : cls.GetSlotOrder()) {
+        const TInMemPropertyDecl& property = cls.GetSlotDecl(slot);
+        const boost::shared_ptr<TInMemPropertyDecl> counterpart = there->FindPropertyDecl(property.GetName());
+        if (!counterpart) {
+            DeclareProperty(source, property, target, *there);
+        } else if (target > source && counterpart->GetType() != property.GetType()) {
+            Note(TSchemaNote::kTypeDiffers, target, source, cls.GetName(), property.GetName());
+        }
+    }
+}
+
+void TSchemaCompletion::Declare(std::size_t source, const TInMemClass& cls, std::size_t target)
+{
+    try {
+        for (const boost::shared_ptr<TInMemClass>& declared : TSchemaCopier(fInventories[target].ns).CopyClass(cls)) {
+            Note(TSchemaNote::kClassDeclared, target, source, declared->GetName(), std::string());
+        }
+    } catch (const TSchemaLimitError&) {
+        throw;
+    } catch (const TZELException& error) {
+        throw TClientError(fInventories[target].path + ": class " + cls.GetName() + " of " + fInventories[source].path +
+                           " cannot be declared here: " + error.what() +
+                           "; a superclass has a property of another type in the two inventories");
+    }
+}
+
+void TSchemaCompletion::DeclareProperty(std::size_t source, const TInMemPropertyDecl& property, std::size_t target,
+                                        TInMemClass& there)
+{
+    try {
+        TSchemaCopier(fInventories[target].ns).CopyPropertyDecl(property, there);
+    } catch (const TSchemaLimitError&) {
+        throw;
+    } catch (const TZELException&) {
+        throw TClientError(fInventories[target].path + ": property " + property.GetName() + " of class " + there.GetName() +
+                           " of " + fInventories[source].path + " cannot be declared here: " + DescribeConflict(there, property) +
+                           "; give them one type in both inventories, or another name");
+    }
+    Note(TSchemaNote::kPropertyDeclared, target, source, there.GetName(), property.GetName());
+}
+
+void TSchemaCompletion::Respell(std::size_t source, const TInMemClass& cls, std::size_t target)
+{
+    TSchemaCopier copier(fInventories[target].ns);
+    const boost::shared_ptr<TInMemClass> there = fInventories[target].ns->FindClass(cls.GetName());
+    const std::string classBefore = there->GetName();
+    if (copier.RespellClass(cls.GetName())) {
+        Note(TSchemaNote::kClassRespelled, target, source, cls.GetName(), std::string(), classBefore);
+    }
+    for (const std::uint32_t slot : cls.GetSlotOrder()) {
+        const std::string& name = cls.GetSlotDecl(slot).GetName();
+        const boost::shared_ptr<TInMemPropertyDecl> counterpart = there->FindPropertyDecl(name);
+        const std::string before = counterpart ? counterpart->GetName() : name;
+        if (before != name && copier.RespellProperty(*there, name)) {
+            Note(TSchemaNote::kPropertyRespelled, target, source, cls.GetName(), name, before);
+        }
+    }
+}
+
+void TSchemaCompletion::Note(TSchemaNote::EKind kind, std::size_t target, std::size_t source, const std::string& className,
+                             const std::string& property, const std::string& before)
+{
+    fNotes.push_back({kind, target, source, className, property, before});
+}
+
+/// Stored references name classes and keys; where declarations changed, those are written anew.
+void TSchemaCompletion::AdaptReferences()
+{
+    std::set<std::size_t> changed;
+    for (const TSchemaNote& note : fNotes) {
+        if (note.kind != TSchemaNote::kTypeDiffers && note.kind != TSchemaNote::kKeysDiffer) {
+            changed.insert(note.inventory);
+        }
+    }
+    for (const std::size_t inventory : changed) {
+        const std::string twice = TReferenceAdapter::AdaptAll(*fInventories[inventory].ns);
+        if (!twice.empty()) {
+            throw TClientError(fInventories[inventory].path + ": has two instances " + twice +
+                               " once names are spelled and keys are declared as in the other inventories; remove one of them");
+        }
+    }
+}
+
+void TSchemaCompletion::SortNotes()
+{
+    const auto key = [](const TSchemaNote& note) {
+        return std::tie(note.source, note.className, note.inventory, note.kind, note.property);
+    };
+    std::sort(fNotes.begin(), fNotes.end(), [&](const TSchemaNote& a, const TSchemaNote& b) { return key(a) < key(b); });
+}
+
+}  // namespace NORVZEL20

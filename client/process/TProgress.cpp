@@ -1,0 +1,49 @@
+#include "client/process/TProgress.h"
+
+#include <exception>
+#include <new>
+#include <utility>
+
+#include "client/process/TSignalsHeld.h"
+
+namespace NORVZEL20 {
+
+TProgress::TProgress(IConsole& console, std::string doing, std::chrono::milliseconds patience)
+    : fConsole(console), fDoing(std::move(doing)), fPatience(patience)
+{
+    const TSignalsHeld held;
+    try {
+        fThread = std::thread([this] { Wait(); });
+    } catch (const std::exception&) {
+        // No thread is to be had, or no memory: then nothing is told.
+    }
+}
+
+TProgress::~TProgress()
+{
+    {
+        const std::lock_guard<std::mutex> lock(fMutex);
+        fDone = true;
+    }
+    fWake.notify_one();
+    if (fThread.joinable()) {
+        fThread.join();
+    }
+    fConsole.ShowProgress("");
+}
+
+void TProgress::Wait() noexcept
+{
+    std::unique_lock<std::mutex> lock(fMutex);
+    unsigned int elapsed = 0;
+    while (!fWake.wait_for(lock, fPatience, [this] { return fDone; })) {
+        ++elapsed;
+        try {
+            fConsole.ShowProgress(fDoing + " (" + std::to_string(elapsed) + " s)");
+        } catch (const std::bad_alloc&) {
+            // There may be memory in a second.
+        }
+    }
+}
+
+}  // namespace NORVZEL20

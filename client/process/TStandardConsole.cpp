@@ -1,0 +1,83 @@
+#include "client/process/TStandardConsole.h"
+
+#include <unistd.h>
+
+#include <cerrno>
+#include <cstdlib>
+#include <cstring>
+
+#include "client/process/StandardDescriptors.h"
+#include "client/process/TClientError.h"
+#include "client/process/WholeWrite.h"
+#include "client/text/DisplayText.h"
+
+namespace NORVZEL20 {
+
+namespace {
+
+const char kWipeLine[] = "\r\x1b[K";
+
+bool IsTerminal(int descriptor)
+{
+    const char* term = std::getenv("TERM");
+    return isatty(descriptor) != 0 && (term == nullptr || std::strcmp(term, "dumb") != 0);
+}
+
+bool IsSet(const char* variable)
+{
+    const char* value = std::getenv(variable);
+    return value != nullptr && *value != '\0';
+}
+
+// Without memory: what could move a terminal is not told.
+void SayPlainly(std::string_view line) noexcept
+{
+    for (const char character : line) {
+        const bool isPlain = character >= ' ' && character <= '~';
+        WriteWhole(STDERR_FILENO, std::string_view(isPlain ? &character : "?", 1));
+    }
+    WriteWhole(STDERR_FILENO, "\n");
+}
+
+}  // namespace
+
+TStandardConsole::TStandardConsole()
+    : fColored(IsTerminal(STDOUT_FILENO) && !IsSet("NO_COLOR")), fProgress(IsTerminal(STDERR_FILENO))
+{}
+
+void TStandardConsole::WriteResult(const std::string& text)
+{
+    const int error = WriteWhole(STDOUT_FILENO, text);
+    if (error == EPIPE || (error == EBADF && IsClosed(STDOUT_FILENO))) {
+        throw TClientError("");
+    }
+    if (error != 0) {
+        throw TClientError(std::string("standard output cannot be written: ") + std::strerror(error));
+    }
+}
+
+void TStandardConsole::Say(std::string_view line) noexcept
+{
+    const std::lock_guard<std::mutex> lock(fMutex);
+    if (fProgressShown) {
+        WriteWhole(STDERR_FILENO, kWipeLine);
+        fProgressShown = false;
+    }
+    try {
+        WriteWhole(STDERR_FILENO, EscapeForDisplay(line) + "\n");
+    } catch (const std::exception&) {
+        SayPlainly(line);
+    }
+}
+
+void TStandardConsole::ShowProgress(std::string_view text) noexcept
+{
+    const std::lock_guard<std::mutex> lock(fMutex);
+    if (fProgress && (fProgressShown || !text.empty())) {
+        WriteWhole(STDERR_FILENO, kWipeLine);
+        WriteWhole(STDERR_FILENO, text);
+        fProgressShown = !text.empty();
+    }
+}
+
+}  // namespace NORVZEL20

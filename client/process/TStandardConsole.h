@@ -1,0 +1,26 @@
+#pragma once
+
+#include <mutex>
+
+#include "client/process/IConsole.h"
+
+namespace NORVZEL20 {
+
+/// The process's own standard output and standard error.
+class TStandardConsole : public IConsole {
+  public:
+    TStandardConsole();
+
+    void WriteResult(const std::string& text) override;
+    void Say(std::string_view line) noexcept override;
+    bool IsColored() const override { return fColored; }
+    void ShowProgress(std::string_view text) noexcept override;
+
+  private:
+    std::mutex fMutex;
+    bool fColored;
+    bool fProgress;
+    bool fProgressShown = false;
+};
+
+}  // namespace NORVZEL20

@@ -1,0 +1,14 @@
+#pragma once
+
+#include <string>
+
+#include "client/comparison/TComparisonReport.h"
+
+namespace NORVZEL20 {
+
+/// The records of the run as a CIM-XML document: the delta schema and the instances of KALMO_DeltaClass, KALMO_Delta and
+/// KALMO_DeltaClassAssocToDelta, in the order in which they were written. It loads like any inventory.
+/// Errors: TZELException of the delta namespace.
+std::string WriteCimXmlReport(const TComparisonReport& report);
+
+}  // namespace NORVZEL20

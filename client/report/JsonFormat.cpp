@@ -1,0 +1,189 @@
+#include "client/report/JsonFormat.h"
+
+#include "client/report/JsonValue.h"
+#include "client/text/TypeName.h"
+
+namespace NORVZEL20 {
+
+namespace {
+
+using TJson = nlohmann::ordered_json;
+
+const char* KindName(TDifference::EKind kind)
+{
+    switch (kind) {
+    case TDifference::kOnlyInReference:
+        return "onlyInReference";
+    case TDifference::kOnlyInOthers:
+        return "onlyInOthers";
+    default:
+        return "changed";
+    }
+}
+
+const char* StateName(TCoverage::EState state)
+{
+    switch (state) {
+    case TCoverage::kCompared:
+        return "compared";
+    case TCoverage::kExcludedByRules:
+        return "excludedByRules";
+    case TCoverage::kUnknownToReference:
+        return "unknownToReference";
+    default:
+        return "madeByCimdelta";
+    }
+}
+
+const char* NoteName(TSchemaNote::EKind kind)
+{
+    switch (kind) {
+    case TSchemaNote::kClassDeclared:
+        return "classDeclared";
+    case TSchemaNote::kPropertyDeclared:
+        return "propertyDeclared";
+    case TSchemaNote::kClassRespelled:
+        return "classRespelled";
+    case TSchemaNote::kPropertyRespelled:
+        return "propertyRespelled";
+    case TSchemaNote::kOperatingSystemMade:
+        return "operatingSystemMade";
+    case TSchemaNote::kTypeDiffers:
+        return "typeDiffers";
+    default:
+        return "keysDiffer";
+    }
+}
+
+TJson Labels(const TComparisonReport& report, const std::vector<std::size_t>& inventories)
+{
+    TJson labels = TJson::array();
+    for (const std::size_t inventory : inventories) {
+        labels.push_back(report.labels[inventory]);
+    }
+    return labels;
+}
+
+TJson ValueWithType(const TCIMValue& value)
+{
+    return {{"type", TypeName(value.GetType())}, {"value", JsonOf(value)}};
+}
+
+void AddValues(TJson& json, const TComparisonReport& report, const TDifference& difference)
+{
+    json["property"] = difference.property;
+    json["reference"] = ValueWithType(difference.reference);
+    TJson others = TJson::array();
+    for (const TDifference::TGroup& group : difference.others) {
+        TJson other = {{"inventories", Labels(report, group.inventories)}};
+        other.update(ValueWithType(group.value));
+        others.push_back(other);
+    }
+    json["others"] = others;
+}
+
+TJson JsonOfDifference(const TComparisonReport& report, const TDifference& difference)
+{
+    TJson keys = TJson::object();
+    for (const auto& key : difference.keys) {
+        keys[key.first] = JsonOf(key.second);
+    }
+    TJson json = {
+        {"kind", KindName(difference.kind)}, {"class", difference.className}, {"instance", difference.instance}, {"keys", keys}};
+    json["inventories"] = Labels(report, difference.inventories);
+    if (difference.kind == TDifference::kChanged) {
+        AddValues(json, report, difference);
+    }
+    return json;
+}
+
+TJson JsonOfSummary(const TComparisonReport& report)
+{
+    const TComparisonReport::TCounts counts = report.Count();
+    return {{"differences", counts.GetTotal()},
+            {"onlyInReference", counts.onlyInReference},
+            {"onlyInOthers", counts.onlyInOthers},
+            {"changedValues", counts.changedValues},
+            {"changedInstances", counts.changedInstances},
+            {"everythingCompared", report.coverage.IsComplete()}};
+}
+
+TJson JsonOfClass(const TCoverage::TClass& cls)
+{
+    return {{"class", cls.name},
+            {"state", StateName(cls.state)},
+            {"instances", cls.instances},
+            {"propertiesLeftOut", cls.leftOut},
+            {"excludedKeys", cls.excludedKeys},
+            {"sharingKeys", cls.sharing}};
+}
+
+TJson JsonOfNote(const TComparisonReport& report, const TSchemaNote& note)
+{
+    TJson json = {{"kind", NoteName(note.kind)},
+                  {"inventory", report.labels[note.inventory]},
+                  {"asIn", report.labels[note.source]},
+                  {"class", note.className}};
+    if (!note.property.empty()) {
+        json["property"] = note.property;
+    }
+    if (!note.before.empty()) {
+        json["before"] = note.before;
+    }
+    return json;
+}
+
+TJson JsonOfCoverage(const TComparisonReport& report)
+{
+    TJson classes = TJson::array();
+    for (const TCoverage::TClass& cls : report.coverage.classes) {
+        classes.push_back(JsonOfClass(cls));
+    }
+    TJson notes = TJson::array();
+    for (const TSchemaNote& note : report.coverage.notes) {
+        notes.push_back(JsonOfNote(report, note));
+    }
+    return {{"classes", classes}, {"classesWithoutInstances", report.coverage.classesWithout}, {"schema", notes}};
+}
+
+TJson JsonOfInventories(const TComparisonReport& report)
+{
+    TJson inventories = TJson::array();
+    for (std::size_t i = 0; i < report.labels.size(); ++i) {
+        inventories.push_back({{"label", report.labels[i]},
+                               {"file", report.paths[i]},
+                               {"role", i == 0 ? "reference" : "other"},
+                               {"instancesCompared", report.coverage.CountCompared(i)}});
+    }
+    return inventories;
+}
+
+}  // namespace
+
+std::string WriteJsonReport(const TComparisonReport& report)
+{
+    TJson differences = TJson::array();
+    for (const TDifference& difference : report.differences) {
+        differences.push_back(JsonOfDifference(report, difference));
+    }
+    const TJson document = {{"format", "cimdelta-comparison"},
+                            {"version", 1},
+                            {"inventories", JsonOfInventories(report)},
+                            {"summary", JsonOfSummary(report)},
+                            {"differences", differences},
+                            {"coverage", JsonOfCoverage(report)}};
+    return WriteJson(document, true);
+}
+
+std::string WriteNdjsonReport(const TComparisonReport& report)
+{
+    std::string lines;
+    for (const TDifference& difference : report.differences) {
+        lines += WriteJson(JsonOfDifference(report, difference), false);
+    }
+    TJson coverage = {{"kind", "coverage"}, {"inventories", JsonOfInventories(report)}, {"summary", JsonOfSummary(report)}};
+    coverage.update(JsonOfCoverage(report));
+    return lines + WriteJson(coverage, false);
+}
+
+}  // namespace NORVZEL20

@@ -1,0 +1,61 @@
+#include "client/report/JsonValue.h"
+
+#include <cmath>
+
+namespace NORVZEL20 {
+
+namespace {
+
+using TJson = nlohmann::ordered_json;
+
+TJson JsonOfReal(const TCIMValue& value)
+{
+    const double real = value.GetReal();
+    if (!std::isfinite(real)) {
+        return value.ToText();
+    }
+    // The shortest text of a real32 is not that of the real64 nearest to it.
+    return value.GetType() == TCIMValue::TCIMType::kReal32 ? TJson::parse(value.ToText(), nullptr, false) : TJson(real);
+}
+
+}  // namespace
+
+nlohmann::ordered_json JsonOf(const TCIMValue& value)
+{
+    if (value.IsNull()) {
+        return nullptr;
+    }
+    if (value.GetType().IsArray()) {
+        TJson elements = TJson::array();
+        for (const TCIMValue& element : value.GetElements()) {
+            elements.push_back(JsonOf(element));
+        }
+        return elements;
+    }
+    switch (value.GetType()) {
+    case TCIMValue::TCIMType::kBoolean:
+        return value.GetBoolean();
+    case TCIMValue::TCIMType::kUint8:
+    case TCIMValue::TCIMType::kUint16:
+    case TCIMValue::TCIMType::kUint32:
+    case TCIMValue::TCIMType::kUint64:
+        return value.GetUnsigned();
+    case TCIMValue::TCIMType::kSint8:
+    case TCIMValue::TCIMType::kSint16:
+    case TCIMValue::TCIMType::kSint32:
+    case TCIMValue::TCIMType::kSint64:
+        return value.GetSigned();
+    case TCIMValue::TCIMType::kReal32:
+    case TCIMValue::TCIMType::kReal64:
+        return JsonOfReal(value);
+    default:
+        return value.ToText();
+    }
+}
+
+std::string WriteJson(const nlohmann::ordered_json& document, bool indented)
+{
+    return document.dump(indented ? 2 : -1, ' ', false, TJson::error_handler_t::replace) + "\n";
+}
+
+}  // namespace NORVZEL20

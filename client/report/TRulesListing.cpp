@@ -1,0 +1,209 @@
+#include "client/report/TRulesListing.h"
+
+#include <algorithm>
+
+#include "client/comparison/TCoverage.h"
+#include "client/process/TClientError.h"
+#include "client/text/Counted.h"
+#include "client/text/DisplayText.h"
+#include "embedded/value/TNameText.h"
+
+namespace NORVZEL20 {
+
+namespace {
+
+const char* Verb(TCIMDiffEngine::propType treatment)
+{
+    return treatment == TCIMDiffEngine::INCLUDE ? "include" : "exclude";
+}
+
+bool Contains(const std::vector<std::string>& names, const std::string& name)
+{
+    return std::any_of(names.begin(), names.end(), [&name](const std::string& other) { return TNameText::Equal(other, name); });
+}
+
+std::vector<std::string> PropertyNames(const TInMemClass& cls)
+{
+    std::vector<std::string> names;
+    for (const std::uint32_t slot : cls.GetSlotOrder()) {
+        names.push_back(cls.GetSlotDecl(slot).GetName());
+    }
+    return names;
+}
+
+std::size_t CountWithSubclasses(const TInMemClass& cls)
+{
+    std::size_t count = cls.GetInstanceCount();
+    for (const boost::shared_ptr<TInMemClass>& below : cls.GetClassesBelow()) {
+        count += below->GetInstanceCount();
+    }
+    return count;
+}
+
+}  // namespace
+
+TRulesListing::TRulesListing(const std::string& file, const TInventory& schema)
+    : fFile(file), fSchema(schema), fRules(schema.ns, file, file), fDocument(TRulesDocument::Read(file)),
+      fTrace(fDocument, schema.ns)
+{}
+
+std::string TRulesListing::WriteCheck()
+{
+    fOut.clear();
+    Line(fFile + ": " + Counted(fDocument.elements.size(), "element") + ", " + Counted(fTrace.GetWarnings().size(), "warning"));
+    WriteElements();
+    WriteEffective();
+    WriteUnmatched();
+    WriteWarnings();
+    return fOut;
+}
+
+void TRulesListing::WriteElements()
+{
+    Line("");
+    Line("Elements:");
+    for (const TRulesDocument::TElement& element : fDocument.elements) {
+        Line("  line " + std::to_string(element.line) + ": class " + element.className + ", default " +
+             Verb(element.defaultTreatment) +
+             (element.excludedKeys.empty() ? "" : ", excludekeys " + Join(element.excludedKeys, " ")));
+        for (const TRulesDocument::TListed& listed : element.listed) {
+            Line("    line " + std::to_string(listed.line) + ": " + Verb(listed.treatment) + " " + listed.property);
+        }
+    }
+}
+
+void TRulesListing::WriteEffective()
+{
+    Line("");
+    Line("Effective rules (classes with instances in " + fSchema.path + ", or with an element):");
+    for (const boost::shared_ptr<TInMemClass>& cls : fSchema.ns->GetClasses()) {
+        if (cls->GetInstanceCount() > 0 || HasElement(cls->GetName())) {
+            WriteEffective(cls);
+        }
+    }
+}
+
+void TRulesListing::WriteEffective(const boost::shared_ptr<TInMemClass>& cls)
+{
+    const std::vector<std::string> compared = fRules.PropertiesOf(cls);
+    if (compared.empty()) {
+        Line("  " + cls->GetName() + ": not compared");
+        return;
+    }
+    std::vector<std::string> leftOut;
+    const std::vector<std::string> all = PropertyNames(*cls);
+    std::copy_if(all.begin(), all.end(), std::back_inserter(leftOut),
+                 [&compared](const std::string& name) { return !Contains(compared, name); });
+    const std::vector<std::string>& keys = fRules.ExcludedKeysOf(cls->GetName());
+    Line("  " + cls->GetName() + ": " + std::to_string(all.size() - leftOut.size()) + " of " +
+         Counted(all.size(), "property", "properties") + " compared" + (leftOut.empty() ? "" : ", all but " + Join(leftOut, ", ")) +
+         (keys.empty() ? "" : "; matched without " + Join(keys, ", ")));
+}
+
+void TRulesListing::WriteUnmatched()
+{
+    std::string unmatched;
+    for (const TRulesDocument::TElement& element : fDocument.elements) {
+        const boost::shared_ptr<TInMemClass> cls = fSchema.ns->FindClass(element.className);
+        if (CountWithSubclasses(*cls) == 0) {
+            unmatched += "  " +
+                         EscapeForDisplay(fFile + ":" + std::to_string(element.line) + ": class " + element.className +
+                                          " has no instances, nor has any class below it") +
+                         "\n";
+        }
+    }
+    if (!unmatched.empty()) {
+        fOut += "\nRules that matched nothing:\n" + unmatched;
+    }
+}
+
+void TRulesListing::WriteWarnings()
+{
+    if (fTrace.GetWarnings().empty()) {
+        return;
+    }
+    Line("");
+    Line("Warnings:");
+    for (const TRuleTrace::TWarning& warning : fTrace.GetWarnings()) {
+        Line("  " + fFile + ":" + std::to_string(warning.line) + ": " + warning.text);
+    }
+}
+
+std::string TRulesListing::WriteExplanation(const std::string& className)
+{
+    fOut.clear();
+    const boost::shared_ptr<TInMemClass> cls = RequireClass(className);
+    const std::vector<std::string> compared = fRules.PropertiesOf(cls);
+    const std::vector<std::string>& keys = fRules.ExcludedKeysOf(cls->GetName());
+    Line(cls->GetName() + ": " + (compared.empty() ? "not compared" : "compared") + "; default " +
+         Verb(fTrace.Find(cls->GetName()).byDefault.treatment) + ", " + Origin(fTrace.Find(cls->GetName()).byDefault));
+    if (!keys.empty()) {
+        Line("  matched without " + Join(keys, ", ") + " (excludekeys, " + fFile + ":" +
+             std::to_string(fTrace.Find(cls->GetName()).excludedKeysLine) + ")");
+    }
+    for (const std::string& property : PropertyNames(*cls)) {
+        Line("  " + Verdict(*cls, property, compared));
+    }
+    return fOut;
+}
+
+std::string TRulesListing::WriteExplanation(const std::string& className, const std::string& property)
+{
+    fOut.clear();
+    const boost::shared_ptr<TInMemClass> cls = RequireClass(className);
+    const boost::shared_ptr<TInMemPropertyDecl> decl = cls->FindPropertyDecl(property);
+    if (!decl) {
+        throw TClientError(fSchema.path + ": class " + cls->GetName() + " has no property " + EscapeForDisplay(property) +
+                           "; cimdelta explain " + cls->GetName() + " lists those it has");
+    }
+    Line(cls->GetName() + "." + Verdict(*cls, decl->GetName(), fRules.PropertiesOf(cls)));
+    return fOut;
+}
+
+bool TRulesListing::HasElement(const std::string& className) const
+{
+    return std::any_of(fDocument.elements.begin(), fDocument.elements.end(), [&className](const TRulesDocument::TElement& element) {
+        return TNameText::Equal(element.className, className);
+    });
+}
+
+boost::shared_ptr<TInMemClass> TRulesListing::RequireClass(const std::string& className) const
+{
+    const boost::shared_ptr<TInMemClass> cls = fSchema.ns->FindClass(className);
+    if (!cls) {
+        throw TClientError(fSchema.path + ": declares no class " + EscapeForDisplay(className) + "; cimdelta show " + fSchema.path +
+                           " lists those it declares");
+    }
+    return cls;
+}
+
+std::string TRulesListing::Verdict(const TInMemClass& cls, const std::string& property,
+                                   const std::vector<std::string>& compared) const
+{
+    const bool isCompared = Contains(compared, property);
+    return property + ": " + (isCompared ? "compared" : "not compared") + ", " + Reason(cls, property, isCompared);
+}
+
+std::string TRulesListing::Reason(const TInMemClass& cls, const std::string& property, bool isCompared) const
+{
+    const TRuleTrace::TDecision decision = fTrace.Decide(cls.GetName(), property);
+    if (!isCompared && decision.treatment == TCIMDiffEngine::INCLUDE && property == kCollectionTime) {
+        return "the time of collection never is where the default is to include";
+    }
+    return decision.isListed ? std::string(Verb(decision.treatment)) + "d by the list at " + Origin(decision)
+                             : std::string("by default, ") + Origin(decision);
+}
+
+std::string TRulesListing::Origin(const TRuleTrace::TDecision& decision) const
+{
+    return decision.fromClass.empty()
+               ? "since no element is for this class or one above it"
+               : fFile + ":" + std::to_string(decision.line) + " (element for class " + decision.fromClass + ")";
+}
+
+void TRulesListing::Line(const std::string& text)
+{
+    fOut += EscapeForDisplay(text) + "\n";
+}
+
+}  // namespace NORVZEL20

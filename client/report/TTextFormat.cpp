@@ -1,0 +1,154 @@
+#include "client/report/TTextFormat.h"
+
+#include <algorithm>
+#include <numeric>
+
+#include "client/report/TextCoverage.h"
+#include "client/text/Counted.h"
+#include "client/text/DisplayText.h"
+#include "client/text/TypeName.h"
+
+namespace NORVZEL20 {
+
+namespace {
+
+const char kBold[] = "\x1b[1m";
+const char kRed[] = "\x1b[31m";
+const char kGreen[] = "\x1b[32m";
+const char kYellow[] = "\x1b[33m";
+const char kPlain[] = "\x1b[0m";
+
+}  // namespace
+
+std::string TTextFormat::Write()
+{
+    fOut = Paint(kBold, Summary()) + "\n";
+    WriteDifferences();
+    fOut += "\n" + WriteTextCoverage(fReport);
+    return fOut;
+}
+
+std::string TTextFormat::Summary() const
+{
+    const TComparisonReport::TCounts counts = fReport.Count();
+    if (counts.GetTotal() == 0) {
+        return Agreement();
+    }
+    return Counted(counts.GetTotal(), "difference") + " between " + Labels({0}) + " and " + Others() + ": " + Kinds(counts);
+}
+
+std::string TTextFormat::Agreement() const
+{
+    const std::string between = " between " + Labels({0}) + " and " + Others();
+    if (fReport.coverage.CountClasses(TCoverage::kCompared) == 0) {
+        return "Nothing was compared" + between + ".";
+    }
+    if (fReport.coverage.IsCompleteButForTimes()) {
+        return "No differences" + between + (fReport.coverage.IsComplete() ? "." : ", times of collection aside.");
+    }
+    return "No differences in what was compared" + between + "; not everything was, see below.";
+}
+
+std::string TTextFormat::Kinds(const TComparisonReport::TCounts& counts) const
+{
+    std::vector<std::string> kinds;
+    if (counts.onlyInReference > 0) {
+        kinds.push_back(Counted(counts.onlyInReference, "instance") +
+                        (IsPair() ? " only in " + Labels({0}) : " of " + Labels({0}) + " missing elsewhere"));
+    }
+    if (counts.onlyInOthers > 0) {
+        kinds.push_back(Counted(counts.onlyInOthers, "instance") + " only " + (IsPair() ? "in " + Others() : "elsewhere"));
+    }
+    if (counts.changedValues > 0) {
+        kinds.push_back(Counted(counts.changedValues, "changed value") + " in " + Counted(counts.changedInstances, "instance"));
+    }
+    return Join(kinds, ", ");
+}
+
+void TTextFormat::WriteDifferences()
+{
+    const TDifference* previous = nullptr;
+    for (const TDifference& difference : fReport.differences) {
+        if (previous == nullptr || previous->className != difference.className) {
+            fOut += "\n" + Paint(kBold, EscapeForDisplay(difference.className)) + "\n";
+            previous = nullptr;
+        }
+        WriteDifference(difference, previous != nullptr && previous->kind == TDifference::kChanged &&
+                                        previous->instance == difference.instance);
+        previous = &difference;
+    }
+}
+
+void TTextFormat::WriteDifference(const TDifference& difference, bool sameInstance)
+{
+    switch (difference.kind) {
+    case TDifference::kOnlyInReference:
+        fOut += Paint(kRed, "- " + InstanceText(difference) + Missing(difference)) + "\n";
+        break;
+    case TDifference::kOnlyInOthers:
+        fOut += Paint(kGreen, "+ " + InstanceText(difference) + Added(difference)) + "\n";
+        break;
+    case TDifference::kChanged:
+        if (!sameInstance) {
+            fOut += Paint(kYellow, "~ " + InstanceText(difference)) + "\n";
+        }
+        fOut += "    " + EscapeForDisplay(difference.property) + ": " + Values(difference) + "\n";
+    }
+}
+
+std::string TTextFormat::Missing(const TDifference& difference) const
+{
+    return IsPair() ? std::string() : "  (not in " + Labels(difference.inventories) + ")";
+}
+
+std::string TTextFormat::Added(const TDifference& difference) const
+{
+    return IsPair() ? std::string() : "  (in " + Labels(difference.inventories) + ")";
+}
+
+std::string TTextFormat::Values(const TDifference& difference) const
+{
+    std::vector<std::string> groups;
+    for (const TDifference::TGroup& group : difference.others) {
+        groups.push_back((IsPair() ? std::string() : Labels(group.inventories) + ": ") + OneValue(difference, group.value));
+    }
+    return OneValue(difference, difference.reference) + " -> " + Join(groups, " / ");
+}
+
+// The type is told where it is what differs.
+std::string TTextFormat::OneValue(const TDifference& difference, const TCIMValue& value) const
+{
+    const bool typesDiffer = std::any_of(difference.others.begin(), difference.others.end(), [&](const TDifference::TGroup& group) {
+        return group.value.GetType() != difference.reference.GetType();
+    });
+    return (typesDiffer ? TypeName(value.GetType()) + " " : std::string()) + DisplayValue(value);
+}
+
+std::string TTextFormat::InstanceText(const TDifference& difference) const
+{
+    const std::string keys = difference.GetKeyText();
+    return keys.empty() ? "(the class's instances; no key counts)" : EscapeForDisplay(keys);
+}
+
+std::string TTextFormat::Labels(const std::vector<std::size_t>& inventories) const
+{
+    std::vector<std::string> labels;
+    for (const std::size_t inventory : inventories) {
+        labels.push_back(EscapeForDisplay(fReport.labels[inventory]));
+    }
+    return Join(labels, ", ");
+}
+
+std::string TTextFormat::Others() const
+{
+    std::vector<std::size_t> others(fReport.labels.size() - 1);
+    std::iota(others.begin(), others.end(), std::size_t(1));
+    return Labels(others);
+}
+
+std::string TTextFormat::Paint(const char* color, const std::string& text) const
+{
+    return fColored ? color + text + kPlain : text;
+}
+
+}  // namespace NORVZEL20

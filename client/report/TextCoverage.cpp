@@ -1,0 +1,176 @@
+#include "client/report/TextCoverage.h"
+
+#include <map>
+#include <utility>
+
+#include "client/text/Counted.h"
+#include "client/text/DisplayText.h"
+
+namespace NORVZEL20 {
+
+namespace {
+
+// A list longer than this is told by its beginning and its length; JSON has it whole.
+const std::size_t kMostNames = 12;
+
+std::string SomeOf(const std::vector<std::string>& names)
+{
+    if (names.size() <= kMostNames) {
+        return Join(names, ", ");
+    }
+    const std::vector<std::string> first(names.begin(), names.begin() + kMostNames);
+    return Join(first, ", ") + " and " + std::to_string(names.size() - kMostNames) + " more";
+}
+
+// The paragraphs of the statement, one after the other.
+class TStatement {
+  public:
+    explicit TStatement(const TComparisonReport& report) : fReport(report), fCoverage(report.coverage) {}
+
+    std::string Write()
+    {
+        WriteCompared();
+        WriteNotCompared();
+        WriteLeftOut();
+        WriteSharing();
+        WriteNotes();
+        return fOut;
+    }
+
+  private:
+    void WriteCompared()
+    {
+        std::vector<std::string> counts;
+        for (std::size_t i = 0; i < fReport.labels.size(); ++i) {
+            counts.push_back(Counted(fCoverage.CountCompared(i), "instance") + " of " + Label(i));
+        }
+        fOut += "Compared: " + Counted(fCoverage.CountClasses(TCoverage::kCompared), "class", "classes") + "; " +
+                Join(counts, ", ") + ".\n";
+        if (fCoverage.classesWithout > 0) {
+            fOut += Counted(fCoverage.classesWithout, "class has", "classes have") + " no instances in any inventory.\n";
+        }
+    }
+
+    void WriteNotCompared()
+    {
+        WriteClasses(TCoverage::kExcludedByRules, "Not compared, because the rules exclude every property");
+        WriteClasses(TCoverage::kUnknownToReference, "Not compared, because " + Label(0) + " does not declare the class");
+        WriteClasses(TCoverage::kOperatingSystemMade, "Not compared, because cimdelta made it");
+    }
+
+    void WriteClasses(TCoverage::EState state, const std::string& title)
+    {
+        std::vector<std::string> classes;
+        for (const TCoverage::TClass& cls : fCoverage.classes) {
+            if (cls.state == state) {
+                classes.push_back(EscapeForDisplay(cls.name) + " (" + Counts(cls.instances) + ")");
+            }
+        }
+        if (!classes.empty()) {
+            fOut += title + ": " + Join(classes, ", ") + ".\n";
+        }
+    }
+
+    // "12 / 0 / 7", in the order of the inventories.
+    static std::string Counts(const std::vector<std::size_t>& counts)
+    {
+        std::vector<std::string> texts;
+        for (const std::size_t count : counts) {
+            texts.push_back(std::to_string(count));
+        }
+        return Join(texts, " / ");
+    }
+
+    void WriteLeftOut()
+    {
+        for (const TCoverage::TClass& cls : fCoverage.classes) {
+            if (!cls.leftOut.empty()) {
+                fOut += "Properties of " + EscapeForDisplay(cls.name) + " not compared: " + EscapeForDisplay(SomeOf(cls.leftOut)) +
+                        ".\n";
+            }
+        }
+    }
+
+    void WriteSharing()
+    {
+        for (const TCoverage::TClass& cls : fCoverage.classes) {
+            std::vector<std::string> counts;
+            for (std::size_t i = 0; i < cls.sharing.size(); ++i) {
+                if (cls.sharing[i] > 0) {
+                    counts.push_back(std::to_string(cls.sharing[i]) + " of " + Label(i));
+                }
+            }
+            if (!counts.empty()) {
+                fOut += "Instances of " + EscapeForDisplay(cls.name) +
+                        " that share their key with another one, since the rules leave out " +
+                        EscapeForDisplay(Join(cls.excludedKeys, ", ")) + ": " + Join(counts, ", ") +
+                        (cls.sharing[0] > 0 ? "; those of " + Label(0) + " were not compared.\n"
+                                            : "; each was compared with the same one.\n");
+            }
+        }
+    }
+
+    void WriteNotes()
+    {
+        WriteDeclared();
+        for (const TSchemaNote& note : fCoverage.notes) {
+            const std::string line = Special(note);
+            if (!line.empty()) {
+                fOut += line + ".\n";
+            }
+        }
+    }
+
+    // Declarations come by the hundred: a line for each pair of inventories.
+    void WriteDeclared()
+    {
+        std::map<std::pair<std::size_t, std::size_t>, std::vector<std::string>> declared;
+        for (const TSchemaNote& note : fCoverage.notes) {
+            if (note.kind == TSchemaNote::kClassDeclared) {
+                declared[{note.inventory, note.source}].push_back("class " + note.className);
+            } else if (note.kind == TSchemaNote::kPropertyDeclared) {
+                declared[{note.inventory, note.source}].push_back(note.className + "." + note.property);
+            }
+        }
+        for (const auto& entry : declared) {
+            fOut += "Declared in " + Label(entry.first.first) + " as in " + Label(entry.first.second) + ": " +
+                    EscapeForDisplay(SomeOf(entry.second)) + ".\n";
+        }
+    }
+
+    std::string Special(const TSchemaNote& note) const
+    {
+        const std::string element = EscapeForDisplay(note.className + (note.property.empty() ? "" : "." + note.property));
+        switch (note.kind) {
+        case TSchemaNote::kClassRespelled:
+        case TSchemaNote::kPropertyRespelled:
+            return "Spelled in " + Label(note.inventory) + " as in " + Label(note.source) + ": " + element + " (was " +
+                   EscapeForDisplay(note.before) + ")";
+        case TSchemaNote::kOperatingSystemMade:
+            return "Made in " + Label(note.inventory) + ": an instance of " + element;
+        case TSchemaNote::kTypeDiffers:
+            return "Of another type in " + Label(note.inventory) + " than in " + Label(note.source) +
+                   ", so equal only where both are NULL: " + element;
+        case TSchemaNote::kKeysDiffer:
+            return "Identified by other keys in " + Label(note.inventory) + " than in " + Label(note.source) + ": " + element +
+                   "; instances match only under rules that exclude the keys that not both have";
+        default:
+            return std::string();
+        }
+    }
+
+    std::string Label(std::size_t inventory) const { return EscapeForDisplay(fReport.labels[inventory]); }
+
+    const TComparisonReport& fReport;
+    const TCoverage& fCoverage;
+    std::string fOut;
+};
+
+}  // namespace
+
+std::string WriteTextCoverage(const TComparisonReport& report)
+{
+    return TStatement(report).Write();
+}
+
+}  // namespace NORVZEL20

@@ -1,0 +1,12 @@
+#pragma once
+
+#include <string>
+
+#include "client/comparison/TComparisonReport.h"
+
+namespace NORVZEL20 {
+
+/// What was compared and what was not, and why, for people; the end of a text report.
+std::string WriteTextCoverage(const TComparisonReport& report);
+
+}  // namespace NORVZEL20

@@ -1,0 +1,63 @@
+#include "client/rules/MadeRules.h"
+
+#include <algorithm>
+
+#include "client/inventory/CimWalk.h"
+#include "client/inventory/OperatingSystem.h"
+
+namespace NORVZEL20 {
+
+namespace {
+
+std::string EscapeAttribute(const std::string& text)
+{
+    std::string escaped;
+    for (const char character : text) {
+        switch (character) {
+        case '&':
+            escaped += "&amp;";
+            break;
+        case '<':
+            escaped += "&lt;";
+            break;
+        case '"':
+            escaped += "&quot;";
+            break;
+        default:
+            escaped += character;
+        }
+    }
+    return escaped;
+}
+
+std::string Element(const std::string& className, const char* treatment)
+{
+    return "  <class name=\"" + EscapeAttribute(className) + "\" default=\"" + treatment + "\"/>\n";
+}
+
+bool IsMade(const std::vector<TSchemaNote>& notes)
+{
+    return std::any_of(notes.begin(), notes.end(),
+                       [](const TSchemaNote& note) { return note.kind == TSchemaNote::kOperatingSystemMade; });
+}
+
+}  // namespace
+
+std::string MakeRulesForEverything(const TInventory& reference, const std::vector<TSchemaNote>& notes)
+{
+    std::string rules = "<?xml version=\"1.0\" encoding=\"UTF-8\"?>\n<DifftoolSpec version=\"1.0\">\n";
+    for (const boost::shared_ptr<ICIMClass>& cls : SubclassesOf(*reference.ns->GetClass("<root>", TCallContext()))) {
+        rules += Element(cls->GetName(TCallContext()), "include");
+    }
+    if (IsMade(notes)) {
+        const boost::shared_ptr<TInMemClass> made = reference.ns->FindClass(kOperatingSystemClass);
+        // Top-level, it has an element already: this second one prevails. Below another class it prevails over that one's.
+        rules += Element(made->GetName(), "exclude");
+        for (const boost::shared_ptr<ICIMClass>& cls : SubclassesOf(*made)) {
+            rules += Element(cls->GetName(TCallContext()), "include");
+        }
+    }
+    return rules + "</DifftoolSpec>\n";
+}
+
+}  // namespace NORVZEL20

@@ -1,0 +1,90 @@
+#include "client/rules/TRules.h"
+
+#include <sys/stat.h>
+
+#include <algorithm>
+#include <cerrno>
+#include <cstring>
+
+#include "client/process/LackOfMemory.h"
+#include "client/process/TClientError.h"
+#include "client/rules/RulesFault.h"
+#include "client/rules/TLogCapture.h"
+#include "host/TZELException.h"
+
+namespace NORVZEL20 {
+
+namespace {
+
+// A name with this in it makes the plug-in go without rules, which nobody asks for by naming a file.
+const char kMarker[] = "|fVMWareEnable";
+
+const off_t kLargestFile = 104857600;
+
+void CheckFile(const std::string& file)
+{
+    struct stat status;
+    if (file.find(kMarker) != std::string::npos) {
+        throw TClientError(file + ": a rules file cannot have " + kMarker + " in its name; rename it");
+    }
+    if (stat(file.c_str(), &status) != 0) {
+        throw TClientError(file + ": cannot be opened: " + std::strerror(errno));
+    }
+    if (!S_ISREG(status.st_mode)) {
+        throw TClientError(file + ": is no regular file; save the rules to a file and name that");
+    }
+    if (status.st_size > kLargestFile) {
+        throw TClientError(file + ": is larger than 104857600 bytes, the most that a rules file may have");
+    }
+}
+
+TCIMDiffEngine::TRuleset ReadRuleset(TCIMDiffEngine& engine, const std::string& file, const std::string& shownName)
+{
+    CheckFile(file);
+    const TLogCapture log;
+    try {
+        return engine.ReadSpecFile(file);
+    } catch (const TZELException& error) {
+        ThrowIfOutOfMemory(error);
+        throw TClientError(DescribeRulesFault(file, shownName, log.GetMessages(), error));
+    }
+}
+
+}  // namespace
+
+TRules::TRules(boost::shared_ptr<ICIMNamespace> schema, const std::string& file, const std::string& shownName)
+    : fSchemas(1, schema), fEngine(boost::shared_ptr<ICIMNamespace>(), fSchemas, std::string()),
+      fRuleset(ReadRuleset(fEngine, file, shownName))
+{}
+
+std::vector<std::string> TRules::PropertiesOf(const boost::shared_ptr<ICIMClass>& cls)
+{
+    return fEngine.buildPropList(Find(cls->GetName(TCallContext())), cls);
+}
+
+std::string TRules::KeyOf(const std::string& className, const boost::shared_ptr<ICIMInstance>& instance)
+{
+    return fEngine.buildPath(Find(className), instance);
+}
+
+const std::vector<std::string>& TRules::ExcludedKeysOf(const std::string& className)
+{
+    return Find(className)->fExcludedKeys;
+}
+
+bool TRules::HasExcludedKeys() const
+{
+    return std::any_of(fRuleset.fRules.begin(), fRuleset.fRules.end(),
+                       [](const auto& entry) { return entry.second->hasExcludedKeys(); });
+}
+
+boost::shared_ptr<TCIMDiffEngine::TDiffClassRules> TRules::Find(const std::string& className)
+{
+    if (!fFound || fFoundName != className) {
+        fFound = fRuleset.getClassRules(className);
+        fFoundName = className;
+    }
+    return fFound;
+}
+
+}  // namespace NORVZEL20

@@ -1,7 +1,0 @@
-#include "embedded/TInMemParameter.h"
-
-namespace NORVZEL20 {
-
-TInMemParameter::TInMemParameter(const std::string& name, TCIMValue::TCIMType type) : fName(name), fType(type) {}
-
-}  // namespace NORVZEL20

@@ -1,9 +1,0 @@
-#include "embedded/TSchemaLimitError.h"
-
-namespace NORVZEL20 {
-
-TSchemaLimitError::TSchemaLimitError(const std::string& text) : TZELException(TZELStatusCode::kNotSupported), fText(text) {}
-
-TSchemaLimitError::~TSchemaLimitError() noexcept = default;
-
-}  // namespace NORVZEL20

@@ -1,0 +1,135 @@
+#include "embedded/cimxml/TCimXmlDraftBuilder.h"
+
+#include <utility>
+
+#include "embedded/store/TSchemaLimits.h"
+#include "embedded/value/TValueText.h"
+
+namespace NORVZEL20 {
+
+using EStatus = TZELStatusCode::EStatusCode;
+
+void TCimXmlDraftBuilder::BeginClass(const char* name, const char* superClass)
+{
+    fDraft.emplace(TCimXmlDraft{TEmbeddedObject(name, true), fContext.GetPlace(), {}, {}});
+    fDraft->object.SetSuperClassName(superClass);
+}
+
+void TCimXmlDraftBuilder::BeginInstance(const char* className)
+{
+    fDraft.emplace(TCimXmlDraft{TEmbeddedObject(className, false), fContext.GetPlace(), {}, {}});
+}
+
+TCimXmlDraft TCimXmlDraftBuilder::Take()
+{
+    TCimXmlDraft draft = std::move(*fDraft);
+    fDraft.reset();
+    return draft;
+}
+
+/// Fails where there are as many as there may be.
+void TCimXmlDraftBuilder::CheckRoom(std::size_t count, std::size_t most, const char* what) const
+{
+    if (count >= most)
+        fContext.Fail(EStatus::kParseError, "found more than " + std::to_string(most) + " " + what + " in " +
+                                                (fDraft->object.IsClass() ? "class " : "an instance of class ") +
+                                                TCimXmlContext::Quote(fDraft->object.GetClassName()) + "; split it");
+}
+
+void TCimXmlDraftBuilder::BeginProperty(const char* name, const TCimXmlAttributes& attributes)
+{
+    CheckRoom(fDraft->object.GetProperties().size(), TSchemaLimits::kMaxProperties, "properties");
+    if (fDraft->object.FindProperty(name) != nullptr)
+        fContext.Fail(EStatus::kParseError, "found property " + TCimXmlContext::Quote(name) + " a second time in one " +
+                                                (fDraft->object.IsClass() ? "class" : "instance"));
+    fPropertyPlace = fContext.GetPlace();
+    fProperty.emplace();
+    fProperty->fName = name;
+    fProperty->fReferenceClass = attributes.Get("REFERENCECLASS");
+    fProperty->fArraySize = ReadArraySize(attributes);
+    fProperty->fClassOrigin = attributes.Get("CLASSORIGIN");
+    fProperty->fPropagated = attributes.IsTrue("PROPAGATED", false);
+}
+
+void TCimXmlDraftBuilder::EndProperty(TCIMValue value)
+{
+    fProperty->fValue = std::move(value);
+    fDraft->object.AddProperty(std::move(*fProperty));
+    fDraft->propertyPlaces.push_back(fPropertyPlace);
+    fProperty.reset();
+}
+
+void TCimXmlDraftBuilder::BeginMethod(const char* name, TCIMValue::TCIMType type, const TCimXmlAttributes& attributes)
+{
+    CheckRoom(fDraft->object.GetMethods().size(), TSchemaLimits::kMaxMethods, "methods");
+    fMethod.emplace();
+    fMethod->fName = name;
+    fMethod->fType = type;
+    fMethod->fClassOrigin = attributes.Get("CLASSORIGIN");
+    fMethod->fPropagated = attributes.IsTrue("PROPAGATED", false);
+}
+
+void TCimXmlDraftBuilder::EndMethod()
+{
+    fDraft->object.AddMethod(std::move(*fMethod));
+    fMethod.reset();
+}
+
+void TCimXmlDraftBuilder::BeginParameter(const char* name, TCIMValue::TCIMType type, const TCimXmlAttributes& attributes)
+{
+    fParameter.emplace();
+    fParameter->fName = name;
+    fParameter->fType = type;
+    fParameter->fReferenceClass = attributes.Get("REFERENCECLASS");
+    fParameter->fArraySize = ReadArraySize(attributes);
+}
+
+void TCimXmlDraftBuilder::EndParameter()
+{
+    fMethod->fParameters.push_back(std::move(*fParameter));
+    fParameter.reset();
+}
+
+void TCimXmlDraftBuilder::AddQualifier(TEmbeddedObject::TQualifier qualifier)
+{
+    const auto& there = fParameter  ? fParameter->fQualifiers
+                        : fMethod   ? fMethod->fQualifiers
+                        : fProperty ? fProperty->fQualifiers
+                                    : fDraft->object.GetQualifiers();
+    CheckRoom(there.size(), TSchemaLimits::kMaxQualifiers, "qualifiers on one element");
+    if (fParameter)
+        fParameter->fQualifiers.push_back(std::move(qualifier));
+    else if (fMethod)
+        fMethod->fQualifiers.push_back(std::move(qualifier));
+    else if (fProperty)
+        fProperty->fQualifiers.push_back(std::move(qualifier));
+    else
+        fDraft->object.AddQualifier(std::move(qualifier));
+}
+
+ICIMQualifierDecl::EFlavor TCimXmlDraftBuilder::ReadFlavor(const TCimXmlAttributes& attributes)
+{
+    unsigned int flavor = ICIMQualifierDecl::kFlavorNone;
+    if (attributes.IsTrue("OVERRIDABLE", true))
+        flavor |= ICIMQualifierDecl::kFlavorOverridable;
+    if (attributes.IsTrue("TOSUBCLASS", true))
+        flavor |= ICIMQualifierDecl::kFlavorToSubclass;
+    if (attributes.IsTrue("TOINSTANCE", false))
+        flavor |= ICIMQualifierDecl::kFlavorToInstance;
+    if (attributes.IsTrue("TRANSLATABLE", false))
+        flavor |= ICIMQualifierDecl::kFlavorTranslatable;
+    return ICIMQualifierDecl::EFlavor(flavor);
+}
+
+unsigned int TCimXmlDraftBuilder::ReadArraySize(const TCimXmlAttributes& attributes) const
+{
+    const char* text = attributes.Find("ARRAYSIZE");
+    if (text == nullptr)
+        return 0;
+    TCIMValue size;
+    if (!TValueText::Parse(TCIMValue::TCIMType::kUint32, text, size))
+        fContext.Fail(EStatus::kParseError, "found the array size " + TCimXmlContext::Quote(text) + ", expected a number");
+    return static_cast<unsigned int>(size.GetUnsigned());
+}
+
+}  // namespace NORVZEL20

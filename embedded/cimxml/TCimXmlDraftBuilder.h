@@ -1,0 +1,50 @@
+#pragma once
+
+#include <optional>
+#include <string>
+
+#include "embedded/cimxml/TCimXmlAttributes.h"
+#include "embedded/cimxml/TCimXmlContext.h"
+#include "embedded/cimxml/TCimXmlDraft.h"
+
+namespace NORVZEL20 {
+
+/// Puts a class or an instance together while its elements are read.
+///
+/// Errors: every operation fails through the context, also where something would go beyond TSchemaLimits.
+class TCimXmlDraftBuilder {
+  public:
+    explicit TCimXmlDraftBuilder(TCimXmlContext& context) : fContext(context) {}
+
+    void BeginClass(const char* name, const char* superClass);
+    void BeginInstance(const char* className);
+    bool IsOpen() const noexcept { return fDraft.has_value(); }
+    TCimXmlDraft Take();
+
+    void BeginProperty(const char* name, const TCimXmlAttributes& attributes);
+    /// Of the property that is open; valid until it ends.
+    const std::string& GetPropertyName() const noexcept { return fProperty->fName; }
+    void EndProperty(TCIMValue value);
+    void BeginMethod(const char* name, TCIMValue::TCIMType type, const TCimXmlAttributes& attributes);
+    void EndMethod();
+    void BeginParameter(const char* name, TCIMValue::TCIMType type, const TCimXmlAttributes& attributes);
+    void EndParameter();
+    /// Puts it on the innermost element that is open.
+    void AddQualifier(TEmbeddedObject::TQualifier qualifier);
+
+    /// The attributes OVERRIDABLE, TOSUBCLASS, TOINSTANCE and TRANSLATABLE with their defaults.
+    static ICIMQualifierDecl::EFlavor ReadFlavor(const TCimXmlAttributes& attributes);
+
+  private:
+    void CheckRoom(std::size_t count, std::size_t most, const char* what) const;
+    unsigned int ReadArraySize(const TCimXmlAttributes& attributes) const;
+
+    TCimXmlContext& fContext;
+    std::optional<TCimXmlDraft> fDraft;
+    std::optional<TEmbeddedObject::TProperty> fProperty;
+    TCimXmlContext::TPlace fPropertyPlace;
+    std::optional<TEmbeddedObject::TMethod> fMethod;
+    std::optional<TEmbeddedObject::TParameter> fParameter;
+};
+
+}  // namespace NORVZEL20

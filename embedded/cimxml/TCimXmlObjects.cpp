@@ -1,0 +1,147 @@
+#include "embedded/cimxml/TCimXmlObjects.h"
+
+#include <type_traits>
+#include <utility>
+
+#include "embedded/store/TInMemClass.h"
+
+namespace NORVZEL20 {
+
+namespace {
+
+using TQualifiers = std::vector<TEmbeddedObject::TQualifier>;
+
+TEmbeddedObject::TQualifier FromQualifier(const ICIMQualifier& qualifier)
+{
+    return {qualifier.GetName(TCallContext()), qualifier.GetValue(TCallContext()), qualifier.GetFlavor(TCallContext()), false};
+}
+
+/// The element's own qualifiers where it tells them apart from inherited ones.
+template <class TElement, class TInMemory>
+TQualifiers FromQualifiers(const TElement& element, const TInMemory* inMemory)
+{
+    TQualifiers qualifiers;
+    if (inMemory != nullptr) {
+        for (const boost::shared_ptr<ICIMQualifier>& qualifier : inMemory->GetQualifiers().GetOwn())
+            qualifiers.push_back(FromQualifier(*qualifier));
+        return qualifiers;
+    }
+    const auto add = [&](const boost::shared_ptr<ICIMQualifier>& qualifier) {
+        qualifiers.push_back(FromQualifier(*qualifier));
+        return true;
+    };
+    element.EnumerateQualifiers(add, TCallContext());
+    return qualifiers;
+}
+
+TEmbeddedObject::TProperty FromPropertyDecl(const ICIMPropertyDecl& decl)
+{
+    TEmbeddedObject::TProperty property;
+    property.fName = decl.GetName(TCallContext());
+    property.fValue = decl.GetDefaultValue(TCallContext());
+    const auto* inMemory = dynamic_cast<const TInMemPropertyDecl*>(&decl);
+    if (inMemory != nullptr) {
+        property.fReferenceClass = inMemory->GetReferenceClass();
+        property.fArraySize = inMemory->GetArraySize();
+    }
+    property.fQualifiers = FromQualifiers(decl, inMemory);
+    return property;
+}
+
+TEmbeddedObject::TMethod FromMethodDecl(const ICIMMethodDecl& decl)
+{
+    TEmbeddedObject::TMethod method;
+    method.fName = decl.GetName(TCallContext());
+    method.fType = decl.GetType(TCallContext());
+    const auto* inMemory = dynamic_cast<const TInMemMethodDecl*>(&decl);
+    method.fQualifiers = FromQualifiers(decl, inMemory);
+    if (inMemory == nullptr)
+        return method;
+    for (const boost::shared_ptr<TInMemParameter>& parameter : inMemory->GetParameters())
+        method.fParameters.push_back({parameter->GetName(), parameter->GetType(), parameter->GetReferenceClass(),
+                                      parameter->GetArraySize(), FromQualifiers(*parameter, parameter.get())});
+    return method;
+}
+
+void AddOwnElements(TEmbeddedObject& object, const TInMemClass& cls)
+{
+    for (const boost::shared_ptr<TInMemPropertyDecl>& decl : cls.GetOwnPropertyDecls())
+        object.AddProperty(FromPropertyDecl(*decl));
+    for (const boost::shared_ptr<TInMemMethodDecl>& decl : cls.GetOwnMethodDecls())
+        object.AddMethod(FromMethodDecl(*decl));
+}
+
+void AddAllElements(TEmbeddedObject& object, const ICIMClass& cls)
+{
+    const auto addProperty = [&](const boost::shared_ptr<ICIMPropertyDecl>& decl) {
+        object.AddProperty(FromPropertyDecl(*decl));
+        return true;
+    };
+    const auto addMethod = [&](const boost::shared_ptr<ICIMMethodDecl>& decl) {
+        object.AddMethod(FromMethodDecl(*decl));
+        return true;
+    };
+    cls.EnumeratePropertyDecls(addProperty, TCallContext());
+    cls.EnumerateMethodDecls(addMethod, TCallContext());
+}
+
+/// Leaves out what is propagated, in the elements' qualifiers too.
+template <class TElement>
+std::vector<TElement> OwnOf(const std::vector<TElement>& elements)
+{
+    std::vector<TElement> own;
+    for (const TElement& element : elements)
+        if (!element.fPropagated)
+            own.push_back(element);
+    if constexpr (!std::is_same_v<TElement, TEmbeddedObject::TQualifier>)
+        for (TElement& element : own)
+            element.fQualifiers = OwnOf(element.fQualifiers);
+    return own;
+}
+
+}  // namespace
+
+TEmbeddedObject TCimXmlObjects::WithoutInherited(const TEmbeddedObject& cls)
+{
+    TEmbeddedObject object(cls.GetClassName(), true);
+    object.SetSuperClassName(cls.GetSuperClassName());
+    for (TEmbeddedObject::TQualifier& qualifier : OwnOf(cls.GetQualifiers()))
+        object.AddQualifier(std::move(qualifier));
+    for (TEmbeddedObject::TProperty& property : OwnOf(cls.GetProperties()))
+        object.AddProperty(std::move(property));
+    for (TEmbeddedObject::TMethod& method : OwnOf(cls.GetMethods()))
+        object.AddMethod(std::move(method));
+    return object;
+}
+
+TEmbeddedObject TCimXmlObjects::FromClass(const ICIMClass& cls)
+{
+    TEmbeddedObject object(cls.GetName(TCallContext()), true);
+    if (const boost::shared_ptr<ICIMClass> super = cls.GetSuperClass(TCallContext()))
+        object.SetSuperClassName(super->GetName(TCallContext()));
+    const auto* inMemory = dynamic_cast<const TInMemClass*>(&cls);
+    for (TEmbeddedObject::TQualifier& qualifier : FromQualifiers(cls, inMemory))
+        object.AddQualifier(std::move(qualifier));
+    if (inMemory != nullptr)
+        AddOwnElements(object, *inMemory);
+    else
+        AddAllElements(object, cls);
+    return object;
+}
+
+TEmbeddedObject::TProperty TCimXmlObjects::FromProperty(const ICIMProperty& property)
+{
+    const boost::shared_ptr<const ICIMPropertyDecl> decl = property.GetPropertyDecl(TCallContext());
+    TEmbeddedObject::TProperty result;
+    result.fName = decl->GetName(TCallContext());
+    result.fValue = property.GetValue(TCallContext());
+    if (const auto* inMemory = dynamic_cast<const TInMemPropertyDecl*>(decl.get())) {
+        result.fReferenceClass = inMemory->GetReferenceClass();
+        result.fArraySize = inMemory->GetArraySize();
+    }
+    if (result.fValue.IsNull())
+        result.fValue = TCIMValue::Null(decl->GetType(TCallContext()));
+    return result;
+}
+
+}  // namespace NORVZEL20

@@ -1,0 +1,214 @@
+#include "embedded/cimxml/TCimXmlPathReader.h"
+
+#include <cstring>
+
+#include "embedded/store/TReferenceAdapter.h"
+#include "embedded/store/TSchemaLimits.h"
+#include "embedded/value/TNameText.h"
+#include "embedded/value/TValueText.h"
+
+namespace NORVZEL20 {
+
+namespace {
+
+// As deep as a path of the host may hold others, the object's own counted.
+constexpr std::size_t kMaxDepth = 12;
+
+using EStatus = TZELStatusCode::EStatusCode;
+using TType = TCIMValue::TCIMType;
+
+/// A number whose type the document does not tell.
+bool ReadNumber(std::string_view text, TCIMValue& value)
+{
+    return TValueText::Parse(TType::kUint64, text, value) || TValueText::Parse(TType::kSint64, text, value) ||
+           TValueText::Parse(TType::kReal64, text, value);
+}
+
+}  // namespace
+
+TCimXmlPathReader::TCimXmlPathReader(TCimXmlContext& context, boost::shared_ptr<TInMemNamespace> ns)
+    : fContext(context), fNamespace(std::move(ns)), fFrames(1)
+{}
+
+void TCimXmlPathReader::Begin()
+{
+    if (++fDepth > kMaxDepth)
+        FailTooDeep();
+    if (fDepth > fFrames.size())
+        fFrames.emplace_back();
+    TFrame& frame = fFrames[fDepth - 1];
+    frame.namespaceName.clear();
+    frame.host.clear();
+    frame.className.clear();
+    frame.keyName.clear();
+    frame.isInBinding = false;
+    frame.keys.clear();
+}
+
+TCIMReference TCimXmlPathReader::End()
+{
+    const TFrame& frame = fFrames[--fDepth];
+    if (frame.className.empty())
+        fContext.Fail(EStatus::kParseError, "found an empty <VALUE.REFERENCE>, expected the name of a class or an instance in it");
+    TCIMReference path;
+    const boost::shared_ptr<TInMemClass> cls = FindClass(frame.className);
+    if (cls) {
+        path.SetClass(cls);
+    } else {
+        fContext.CheckName("class", frame.className);
+        path.SetClassName(frame.className);
+        fMetUnknownClass = true;
+    }
+    if (!frame.namespaceName.empty() && !fContext.IsOwn(frame.namespaceName, frame.host)) {
+        path.SetNamespaceName(frame.namespaceName);
+        path.SetHost(frame.host);
+    }
+    for (const auto& [declared, value] : frame.keys) {
+        std::string name = declared.empty() ? FindOnlyKey(cls.get()) : declared;
+        TCIMValue adapted = value;
+        if (!cls || TReferenceAdapter::AdaptKey(*cls, name, adapted) == nullptr)
+            fContext.CheckName("key", name);
+        AddKeyTo(path, name, adapted);
+    }
+    if (path.GetKeyCount() < frame.keys.size())
+        fContext.Fail(EStatus::kParseError, "found a key a second time in one path, expected each once");
+    return path;
+}
+
+void TCimXmlPathReader::AddKeyTo(TCIMReference& path, const std::string& name, const TCIMValue& value) const
+{
+    try {
+        path.AddKeyValue(name, value);
+    } catch (const TZELException&) {
+        FailTooDeep();
+    }
+}
+
+void TCimXmlPathReader::FailTooDeep() const
+{
+    fContext.Fail(EStatus::kParseError,
+                  "found object paths within each other more than " + std::to_string(kMaxDepth) + " deep, expected fewer");
+}
+
+/// The key that a value without a name belongs to.
+const std::string& TCimXmlPathReader::FindOnlyKey(const TInMemClass* cls) const
+{
+    if (cls == nullptr || cls->GetKeySlots().size() != 1)
+        fContext.Fail(EStatus::kParseError, "found a key value without a name, expected it in a <KEYBINDING> that names the key"
+                                            " (or a class with one key, declared in front of it)");
+    return cls->GetSlotDecl(cls->GetKeySlots().front()).GetName();
+}
+
+boost::shared_ptr<TInMemClass> TCimXmlPathReader::FindClass(const std::string& name)
+{
+    if (!fNamespace || (fLastClass && fLastClass->GetName() == name))
+        return fLastClass;
+    boost::shared_ptr<TInMemClass> cls = fNamespace->FindClass(name);
+    if (cls)
+        fLastClass = cls;
+    return cls;
+}
+
+void TCimXmlPathReader::NoteOwnNamespace()
+{
+    const TFrame& frame = fFrames.front();
+    if (fDepth > 0 && !frame.namespaceName.empty())
+        fContext.NoteNamespace(frame.namespaceName, frame.host);
+}
+
+void TCimXmlPathReader::BeginNamespacePath()
+{
+    fNamespaceName.clear();
+    fHost.clear();
+}
+
+void TCimXmlPathReader::AddNamespace(const char* name)
+{
+    if (!fNamespaceName.empty())
+        fNamespaceName += '/';
+    if (std::strpbrk(name, ":=\"") != nullptr)
+        fContext.Fail(EStatus::kParseError, "found namespace " + TCimXmlContext::Quote(name) + ", expected a name without \":=");
+    fNamespaceName += name;
+}
+
+void TCimXmlPathReader::SetHost(std::string_view host)
+{
+    if (!fHost.empty() || host.find('/') != std::string_view::npos)
+        fContext.Fail(EStatus::kParseError, "found host " + TCimXmlContext::Quote(host) + ", expected one, without a slash");
+    fHost = host;
+}
+
+void TCimXmlPathReader::EndNamespacePath()
+{
+    if (fDepth == 0) {
+        fContext.NoteNamespace(fNamespaceName, fHost);
+        return;
+    }
+    if (!fFrames[fDepth - 1].namespaceName.empty())
+        fContext.Fail(EStatus::kParseError, "found a second namespace in one path, expected one");
+    fFrames[fDepth - 1].namespaceName = fNamespaceName;
+    fFrames[fDepth - 1].host = fHost;
+}
+
+void TCimXmlPathReader::SetClassName(const char* name)
+{
+    if (!fFrames[fDepth - 1].className.empty())
+        fContext.Fail(EStatus::kParseError, "found a second path where one is expected");
+    fFrames[fDepth - 1].className = name;
+}
+
+void TCimXmlPathReader::BeginKeyBinding(const char* name)
+{
+    fFrames[fDepth - 1].keyName = name;
+    fFrames[fDepth - 1].isInBinding = true;
+}
+
+void TCimXmlPathReader::EndKeyBinding()
+{
+    TFrame& frame = fFrames[fDepth - 1];
+    if (!frame.keyName.empty())
+        fContext.Fail(EStatus::kParseError,
+                      "found key " + TCimXmlContext::Quote(frame.keyName) +
+                          " without a value, expected a <KEYVALUE> or a <VALUE.REFERENCE> in its <KEYBINDING>");
+    frame.isInBinding = false;
+}
+
+void TCimXmlPathReader::BeginKeyValue(const TCimXmlAttributes& attributes)
+{
+    fValueType = attributes.Get("VALUETYPE");
+    fType = attributes.Get("TYPE");
+}
+
+void TCimXmlPathReader::EndKeyValue(std::string_view text)
+{
+    AddKey(ReadKey(text));
+}
+
+void TCimXmlPathReader::AddKey(TCIMValue value)
+{
+    TFrame& frame = fFrames[fDepth - 1];
+    if (frame.isInBinding && frame.keyName.empty())
+        fContext.Fail(EStatus::kParseError, "found a second value in one <KEYBINDING>, expected one");
+    if (frame.keys.size() == TSchemaLimits::kMaxKeyBindings)
+        fContext.Fail(EStatus::kParseError,
+                      "found more than " + std::to_string(TSchemaLimits::kMaxKeyBindings) + " key bindings in one path");
+    frame.keys.emplace_back(frame.keyName, std::move(value));
+    frame.keyName.clear();
+}
+
+TCIMValue TCimXmlPathReader::ReadKey(std::string_view text)
+{
+    const TType type = TValueText::FindType(fType);
+    if ((type == TType::kNone && (fValueType.empty() || fValueType == "string")) || type == TType::kString)
+        return fContext.GetTexts().MakeValue(text);
+    TCIMValue value;
+    if (type != TType::kNone      ? TValueText::Parse(type, text, value)
+        : fValueType == "boolean" ? TValueText::Parse(TType::kBoolean, text, value)
+                                  : ReadNumber(text, value))
+        return value;
+    const std::string expected = type != TType::kNone ? fType : fValueType == "boolean" ? "boolean" : "number";
+    fContext.Fail(EStatus::kTypeMismatch,
+                  "found " + TCimXmlContext::Quote(text) + " as the value of a key, expected a " + expected);
+}
+
+}  // namespace NORVZEL20

@@ -1,0 +1,47 @@
+#include "embedded/cimxml/TTextPool.h"
+
+#include <cstdint>
+#include <cstring>
+#include <utility>
+
+#include "embedded/value/TValueAccess.h"
+
+namespace NORVZEL20 {
+
+namespace {
+
+constexpr std::uint64_t kFactor = 0x9e3779b97f4a7c15u;
+
+/// Mixes eight bytes at a time; the last eight overlap what came before. For text of eight bytes and more.
+std::uint64_t HashOf(std::string_view text)
+{
+    const auto load = [&](std::size_t position) {
+        std::uint64_t word;
+        std::memcpy(&word, text.data() + position, sizeof word);
+        return word;
+    };
+    std::uint64_t hash = text.size() * kFactor;
+    for (std::size_t position = 0; position + 8 < text.size(); position += 8)
+        hash = (hash ^ load(position)) * kFactor ^ hash >> 32;
+    return (hash ^ load(text.size() - 8)) * kFactor;
+}
+
+}  // namespace
+
+TCIMValue TTextPool::MakeValue(std::string_view text)
+{
+    if (text.size() <= TValueAccess::kShortTextSize || text.size() > kLongest)
+        return TCIMValue::FromText(text);
+    const std::uint64_t hash = HashOf(text);
+    const auto mark = static_cast<std::uint32_t>(hash);
+    TBucket& bucket = fBuckets[hash >> 54];
+    if (bucket.hash == mark && bucket.text && bucket.text->GetText() == text)
+        return TValueAccess::FromSharedText(bucket.text);
+    if (std::exchange(bucket.last, mark) != mark)
+        return TCIMValue::FromText(text);
+    bucket.text = TSharedText::Create(text);
+    bucket.hash = mark;
+    return TValueAccess::FromSharedText(bucket.text);
+}
+
+}  // namespace NORVZEL20

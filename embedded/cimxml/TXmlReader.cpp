@@ -1,0 +1,254 @@
+#include "embedded/cimxml/TXmlReader.h"
+
+#ifndef XML_DTD
+#define XML_DTD  // without it the header hides the limits of entity expansion, which the library has
+#endif
+#include <expat.h>
+
+#include <algorithm>
+#include <climits>
+#include <cstring>
+#include <new>
+#include <utility>
+
+namespace NORVZEL20 {
+
+void TXmlReader::TFree::operator()(XML_ParserStruct* parser) const noexcept
+{
+    XML_ParserFree(parser);
+}
+
+/// What the C library calls. Nothing thrown leaves these functions.
+struct TXmlReader::TCallbacks {
+    template <class TAction>
+    static void Guarded(void* user, TAction action) noexcept
+    {
+        TXmlReader& reader = *static_cast<TXmlReader*>(user);
+        if (reader.fStopped)
+            return;  // the library delivers a few events more after it was told to stop
+        try {
+            action(reader);
+        } catch (...) {
+            reader.fException = std::current_exception();
+            reader.Stop();
+        }
+    }
+
+    static void Start(void* user, const char* name, const char** attributes) noexcept
+    {
+        Guarded(user, [=](TXmlReader& reader) {
+            if (++reader.fDepth > kMaxDepth)
+                return reader.Refuse("elements are nested too deeply");
+            if (static_cast<std::size_t>(XML_GetCurrentByteCount(reader.fParser.get())) > kMaxTokenLength)
+                return reader.Refuse("a tag is too long");
+            if (const char* reason = reader.FindExcess(attributes))
+                return reader.Refuse(reason);
+            reader.HandOverText();
+            reader.fSink.OnStart(name, attributes);
+            reader.fText.clear();
+        });
+    }
+
+    static void End(void* user, const char* name) noexcept
+    {
+        Guarded(user, [=](TXmlReader& reader) {
+            --reader.fDepth;
+            reader.HandOverText();
+            reader.fSink.OnEnd(name);
+            reader.fText.clear();
+        });
+    }
+
+    static void Text(void* user, const char* text, int length) noexcept
+    {
+        Guarded(user, [=](TXmlReader& reader) {
+            if (reader.fText.size() + static_cast<std::size_t>(length) > kMaxTextLength)
+                return reader.Refuse("text is too long");
+            reader.fText.append(text, static_cast<std::size_t>(length));
+        });
+    }
+
+    static void Instruction(void* user, const char* target, const char* data) noexcept
+    {
+        Guarded(user, [=](TXmlReader& reader) { reader.fSink.OnProcessingInstruction(target, data); });
+    }
+
+    static void Notation(void* user, const char* name, const char*, const char* systemId, const char* publicId) noexcept
+    {
+        Guarded(user, [=](TXmlReader& reader) { reader.fSink.OnNotation(name, publicId, systemId); });
+    }
+
+    static void DocumentType(void* user, const char*, const char*, const char*, int) noexcept
+    {
+        Guarded(user, [](TXmlReader& reader) { reader.Refuse("a document type declaration may not stand here"); });
+    }
+
+    /// Entities expand recursively inside the library, so their number bounds its stack.
+    static void Entity(void* user, const char*, int, const char*, int, const char*, const char*, const char*, const char*) noexcept
+    {
+        Guarded(user, [](TXmlReader& reader) {
+            if (++reader.fEntities > kMaxEntities)
+                reader.Refuse("too many entity declarations");
+        });
+    }
+
+    static int ExternalEntity(XML_Parser parser, const char*, const char*, const char*, const char*) noexcept
+    {
+        Guarded(XML_GetUserData(parser), [](TXmlReader& reader) { reader.Refuse("external entities are not read"); });
+        return XML_STATUS_ERROR;
+    }
+
+    static void SkippedEntity(void* user, const char*, int) noexcept
+    {
+        Guarded(user, [](TXmlReader& reader) { reader.Refuse("undeclared entity"); });
+    }
+};
+
+TXmlReader::TXmlReader(ISink& sink) : fSink(sink), fParser(XML_ParserCreate(nullptr))
+{
+    if (!fParser)
+        throw std::bad_alloc();
+    Install();
+}
+
+TXmlReader::~TXmlReader() = default;
+
+void TXmlReader::Install()
+{
+    XML_Parser parser = fParser.get();
+    XML_SetUserData(parser, this);
+    XML_SetElementHandler(parser, TCallbacks::Start, TCallbacks::End);
+    XML_SetCharacterDataHandler(parser, TCallbacks::Text);
+    XML_SetProcessingInstructionHandler(parser, TCallbacks::Instruction);
+    XML_SetNotationDeclHandler(parser, TCallbacks::Notation);
+    XML_SetStartDoctypeDeclHandler(parser, fRefusesDocumentTypes ? TCallbacks::DocumentType : nullptr);
+    XML_SetEntityDeclHandler(parser, TCallbacks::Entity);
+    XML_SetExternalEntityRefHandler(parser, TCallbacks::ExternalEntity);
+    XML_SetSkippedEntityHandler(parser, TCallbacks::SkippedEntity);
+    XML_SetBillionLaughsAttackProtectionMaximumAmplification(parser, kMaxAmplification);
+    XML_SetBillionLaughsAttackProtectionActivationThreshold(parser, kExpansionThreshold);
+}
+
+void TXmlReader::Reset(const char* encoding)
+{
+    // Resetting to an encoding would fall back to the document's own, without a word, where memory is short.
+    XML_ParserReset(fParser.get(), nullptr);
+    if (encoding != nullptr && XML_SetEncoding(fParser.get(), encoding) == XML_STATUS_ERROR)
+        throw std::bad_alloc();
+    Install();
+    fText.clear();
+    fDepth = fEntities = fBytes = fDefaultBytes = 0;
+    fError.clear();
+    fException = nullptr;
+    fStopped = false;
+}
+
+/// Why the attributes are too many or too long; null where they are not. Defaults are declared once and handed out for every
+/// element, which the library's own limit does not see.
+const char* TXmlReader::FindExcess(const char** attributes)
+{
+    const auto specified = static_cast<std::size_t>(XML_GetSpecifiedAttributeCount(fParser.get()));  // names and values
+    std::size_t count = specified;
+    for (; attributes[count] != nullptr; count += 2)
+        fDefaultBytes += std::strlen(attributes[count + 1]);
+    if (count > 2 * kMaxAttributes)
+        return "too many attributes";
+    if (count > specified && fDefaultBytes > kExpansionThreshold &&
+        static_cast<double>(fDefaultBytes) > kMaxAmplification * static_cast<double>(fBytes))
+        return "attribute defaults expand too much";
+    return nullptr;
+}
+
+bool TXmlReader::Parse(const char* data, std::size_t length, bool last)
+{
+    while (!fStopped && (length > 0 || last)) {
+        const std::size_t piece = std::min<std::size_t>(length, INT_MAX / 2);
+        const bool final = last && piece == length;
+        fBytes += piece;
+        if (!Settle(XML_Parse(fParser.get(), data, static_cast<int>(piece), final) != XML_STATUS_ERROR))
+            return false;
+        if (final)
+            break;
+        data += piece;
+        length -= piece;
+    }
+    return fError.empty();
+}
+
+bool TXmlReader::Finish()
+{
+    return Parse("", 0, true);
+}
+
+char* TXmlReader::GetBuffer(std::size_t length)
+{
+    void* buffer = length > INT_MAX / 2 ? nullptr : XML_GetBuffer(fParser.get(), static_cast<int>(length));
+    if (buffer == nullptr)
+        throw std::bad_alloc();
+    return static_cast<char*>(buffer);
+}
+
+bool TXmlReader::ParseBuffer(std::size_t length)
+{
+    if (fStopped)
+        return fError.empty();
+    fBytes += length;
+    return Settle(XML_ParseBuffer(fParser.get(), static_cast<int>(length), XML_FALSE) != XML_STATUS_ERROR);
+}
+
+/// Looks at what a call of the library left: a stopped parse, an error of the library, or a tag that goes on too long.
+bool TXmlReader::Settle(bool succeeded)
+{
+    if (fException)
+        std::rethrow_exception(std::exchange(fException, nullptr));
+    if (fStopped)
+        return fError.empty();
+    if (!succeeded) {
+        const XML_Error code = XML_GetErrorCode(fParser.get());
+        if (code == XML_ERROR_NO_MEMORY)
+            throw std::bad_alloc();
+        Refuse(XML_ErrorString(code));
+        return false;
+    }
+    if (GetPending() > kMaxTokenLength)
+        Refuse("a tag is too long");
+    return fError.empty();
+}
+
+std::size_t TXmlReader::GetPending() const
+{
+    const XML_Index index = XML_GetCurrentByteIndex(fParser.get());
+    return index < 0 ? 0 : fBytes - static_cast<std::size_t>(index);
+}
+
+void TXmlReader::Stop()
+{
+    fLine = GetLine();  // the library moves on a little when it stops
+    fColumn = GetColumn();
+    fStopped = true;
+    XML_StopParser(fParser.get(), XML_FALSE);
+}
+
+void TXmlReader::Refuse(const char* reason)
+{
+    fError = reason;
+    Stop();
+}
+
+void TXmlReader::HandOverText()
+{
+    if (!fText.empty())
+        fSink.OnText(fText.c_str(), fText.size());
+}
+
+std::size_t TXmlReader::GetLine() const
+{
+    return fStopped ? fLine : XML_GetCurrentLineNumber(fParser.get());
+}
+
+std::size_t TXmlReader::GetColumn() const
+{
+    return fStopped ? fColumn : XML_GetCurrentColumnNumber(fParser.get()) + 1;
+}
+
+}  // namespace NORVZEL20

@@ -1,0 +1,119 @@
+#include "embedded/query/TLikePattern.h"
+
+#include <algorithm>
+
+namespace NORVZEL20 {
+
+namespace {
+
+std::size_t SequenceLength(unsigned char lead)
+{
+    if (lead < 0xc2) {
+        return 1;
+    }
+    return lead < 0xe0 ? 2 : lead < 0xf0 ? 3 : lead < 0xf5 ? 4 : 1;
+}
+
+/// Bytes outside of UTF-8 get numbers beyond those of all characters, so that they equal nothing but themselves.
+std::vector<char32_t> Decode(std::string_view text)
+{
+    std::vector<char32_t> characters;
+    characters.reserve(text.size());
+    for (std::size_t at = 0; at < text.size();) {
+        const auto lead = static_cast<unsigned char>(text[at]);
+        const std::size_t length = SequenceLength(lead);
+        char32_t character = length == 1 ? lead : char32_t(lead & (0xffU >> (length + 1)));
+        bool isWhole = at + length <= text.size() && (lead < 0x80 || length > 1);
+        for (std::size_t next = 1; isWhole && next < length; ++next) {
+            const auto byte = static_cast<unsigned char>(text[at + next]);
+            isWhole = (byte & 0xc0U) == 0x80;
+            character = character << 6 | (byte & 0x3fU);
+        }
+        characters.push_back(isWhole ? character : char32_t(0x110000U + lead));
+        at += isWhole ? length : 1;
+    }
+    return characters;
+}
+
+}  // namespace
+
+TLikePattern::TLikePattern(std::string_view pattern)
+{
+    const std::vector<char32_t> characters = Decode(pattern);
+    bool canClose = true;  // whether a bracket may still be closed: where one is not, neither are those behind it
+    for (std::size_t at = 0; at < characters.size();) {
+        const char32_t character = characters[at];
+        const bool opens = character == U'[' && canClose;
+        const std::size_t end = opens ? ReadSet(characters, at + 1) : 0;
+        canClose = canClose && (!opens || end != 0);
+        if (end != 0) {
+            at = end;
+            continue;
+        }
+        if (character == U'%') {
+            fSteps.push_back(TStep{TStep::kAnyText, {}});
+        } else if (character == U'_') {
+            fSteps.push_back(TStep{TStep::kAnyCharacter, {}});
+        } else {
+            fSteps.push_back(TStep{TStep::kOneOf, {{character, character}}});
+        }
+        ++at;
+    }
+}
+
+/// Reads a set whose bracket stands in front of `at`; the position behind its second bracket, or 0 where there is none.
+std::size_t TLikePattern::ReadSet(const std::vector<char32_t>& pattern, std::size_t at)
+{
+    const bool isInverted = at < pattern.size() && pattern[at] == U'^';
+    TStep set{isInverted ? TStep::kNoneOf : TStep::kOneOf, {}};
+    at += isInverted ? 1 : 0;
+    for (bool isFirst = true; at < pattern.size(); isFirst = false) {
+        if (pattern[at] == U']' && !isFirst) {
+            fSteps.push_back(std::move(set));
+            return at + 1;
+        }
+        const bool isRange = at + 2 < pattern.size() && pattern[at + 1] == U'-' && pattern[at + 2] != U']';
+        const std::size_t last = isRange ? at + 2 : at;
+        set.fRanges.emplace_back(pattern[at], pattern[last]);
+        at = last + 1;
+    }
+    return 0;
+}
+
+bool TLikePattern::Fits(const TStep& step, char32_t character)
+{
+    if (step.fKind == TStep::kAnyCharacter) {
+        return true;
+    }
+    const bool isIn = std::any_of(step.fRanges.begin(), step.fRanges.end(),
+                                  [character](const auto& range) { return range.first <= character && character <= range.second; });
+    return isIn == (step.fKind == TStep::kOneOf);
+}
+
+bool TLikePattern::Matches(std::string_view text) const
+{
+    const std::vector<char32_t> characters = Decode(text);
+    std::size_t step = 0;
+    std::size_t at = 0;
+    std::size_t retryStep = fSteps.size();  // behind the last % so far, from which to go on one character later
+    std::size_t retryAt = 0;
+    bool canRetry = false;
+    while (at < characters.size() || step < fSteps.size()) {
+        if (step < fSteps.size() && fSteps[step].fKind == TStep::kAnyText) {
+            retryStep = ++step;
+            retryAt = at;
+            canRetry = true;
+        } else if (step < fSteps.size() && at < characters.size() && Fits(fSteps[step], characters[at])) {
+            ++step;
+            ++at;
+        } else if (canRetry && retryAt < characters.size()) {
+            step = retryStep;
+            at = ++retryAt;
+        } else {
+            return false;
+        }
+    }
+    return true;
+}
+
+}  // namespace NORVZEL20

@@ -1,0 +1,126 @@
+#include "embedded/query/TQueryComparison.h"
+
+#include "embedded/value/TValueText.h"
+#include "host/TCIMDateTime.h"
+#include "host/TCIMReference.h"
+
+namespace NORVZEL20 {
+
+namespace {
+
+using TType = TCIMValue::TCIMType;
+
+bool IsNumber(TType type)
+{
+    return type >= TType::kUint8 && type <= TType::kReal64;
+}
+
+/// Types whose values can be written as a text literal.
+bool IsTextual(TType type)
+{
+    return type == TType::kString || type == TType::kChar16 || type == TType::kDateTime || type == TType::kReference;
+}
+
+/// Exact for every number: the significand of a long double has 64 bits at least.
+long double GetNumber(const TCIMValue& value)
+{
+    switch (value.GetType()) {
+    case TType::kReal32:
+    case TType::kReal64:
+        return value.GetReal();
+    case TType::kSint8:
+    case TType::kSint16:
+    case TType::kSint32:
+    case TType::kSint64:
+        return static_cast<long double>(value.GetSigned());
+    default:
+        return static_cast<long double>(value.GetUnsigned());
+    }
+}
+
+template <class T>
+TQueryComparison::EResult Order(const T& a, const T& b)
+{
+    if (a < b) {
+        return TQueryComparison::kLess;
+    }
+    if (b < a) {
+        return TQueryComparison::kGreater;
+    }
+    return a == b ? TQueryComparison::kEqual : TQueryComparison::kUnordered;
+}
+
+bool ReadDateTime(const TCIMValue& value, TCIMDateTime& time)
+{
+    if (value.GetType() == TType::kDateTime) {
+        time = value.GetDateTime();
+        return time.GetUnknown() == 0;
+    }
+    return TCIMDateTime::Parse(value.GetString(), time) && time.GetUnknown() == 0;
+}
+
+TQueryComparison::EResult CompareDateTimes(const TCIMValue& a, const TCIMValue& b)
+{
+    TCIMDateTime first;
+    TCIMDateTime second;
+    if (!ReadDateTime(a, first) || !ReadDateTime(b, second)) {
+        return TQueryComparison::kUnknown;
+    }
+    return Order(first, second);
+}
+
+bool HoldsObject(const TCIMValue& value)
+{
+    return value.GetType() == TType::kString && value.GetEmbeddedObject();
+}
+
+}  // namespace
+
+bool TQueryComparison::AreComparable(TCIMValue::TCIMType a, TCIMValue::TCIMType b)
+{
+    if (a.IsArray() || b.IsArray()) {
+        return false;
+    }
+    if (a == TType::kNone || b == TType::kNone || a == b) {
+        return true;
+    }
+    const bool isText = a == TType::kString || b == TType::kString;
+    return (IsNumber(a) && IsNumber(b)) || (isText && IsTextual(a) && IsTextual(b));
+}
+
+bool TQueryComparison::AreOrdered(TCIMValue::TCIMType a, TCIMValue::TCIMType b)
+{
+    const auto isUnordered = [](TType type) { return type == TType::kBoolean || type == TType::kReference; };
+    return !isUnordered(a) && !isUnordered(b);
+}
+
+bool TQueryComparison::IsReadable(const TCIMValue& literal, TCIMValue::TCIMType type)
+{
+    if (literal.IsNull() || literal.GetType() != TType::kString || type != TType::kDateTime) {
+        return true;
+    }
+    TCIMDateTime time;
+    return TCIMDateTime::Parse(literal.GetString(), time);
+}
+
+TQueryComparison::EResult TQueryComparison::Compare(const TCIMValue& a, const TCIMValue& b)
+{
+    if (a.IsNull() || b.IsNull() || HoldsObject(a) || HoldsObject(b)) {
+        return kUnknown;
+    }
+    if (IsNumber(a.GetType())) {
+        return Order(GetNumber(a), GetNumber(b));
+    }
+    if (a.GetType() == TType::kBoolean) {
+        return a.GetBoolean() == b.GetBoolean() ? kEqual : kUnordered;
+    }
+    if (a.GetType() == TType::kDateTime || b.GetType() == TType::kDateTime) {
+        return CompareDateTimes(a, b);
+    }
+    if (a.GetType() == TType::kString && b.GetType() == TType::kString) {
+        return Order(a.GetString(), b.GetString());
+    }
+    return Order(a.ToText(), b.ToText());
+}
+
+}  // namespace NORVZEL20

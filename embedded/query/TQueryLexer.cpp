@@ -1,0 +1,111 @@
+#include "embedded/query/TQueryLexer.h"
+
+#include "embedded/query/TQueryError.h"
+
+namespace NORVZEL20 {
+
+namespace {
+
+bool IsSpace(char c)
+{
+    return c == ' ' || c == '\t' || c == '\n' || c == '\r';
+}
+
+bool IsDigit(char c)
+{
+    return c >= '0' && c <= '9';
+}
+
+bool IsNameStart(char c)
+{
+    return (c >= 'a' && c <= 'z') || (c >= 'A' && c <= 'Z') || c == '_' || static_cast<unsigned char>(c) >= 0x80;
+}
+
+bool IsNamePart(char c)
+{
+    return IsNameStart(c) || IsDigit(c);
+}
+
+bool IsSign(char c)
+{
+    return c == '+' || c == '-';
+}
+
+}  // namespace
+
+TQueryToken TQueryLexer::Next()
+{
+    while (fAt < fText.size() && IsSpace(fText[fAt])) {
+        ++fAt;
+    }
+    if (fAt == fText.size()) {
+        return TQueryToken{TQueryToken::kEnd, std::string(), fAt};
+    }
+    if (IsNameStart(Peek())) {
+        return ReadName();
+    }
+    if (IsDigit(Peek()) || (IsSign(Peek()) && (IsDigit(Peek(1)) || Peek(1) == '.')) || (Peek() == '.' && IsDigit(Peek(1)))) {
+        return ReadNumber();
+    }
+    if (Peek() == '\'' || Peek() == '"') {
+        return ReadText();
+    }
+    return ReadSymbol();
+}
+
+TQueryToken TQueryLexer::ReadName()
+{
+    const std::size_t begin = fAt;
+    while (IsNamePart(Peek())) {
+        ++fAt;
+    }
+    return TQueryToken{TQueryToken::kName, fText.substr(begin, fAt - begin), begin};
+}
+
+/// Takes whatever may belong to a number; whether it is one, its reader tells.
+TQueryToken TQueryLexer::ReadNumber()
+{
+    const std::size_t begin = fAt;
+    const bool isHexadecimal = Peek() == '0' && (Peek(1) == 'x' || Peek(1) == 'X');
+    ++fAt;
+    while (IsNamePart(Peek()) || Peek() == '.' ||
+           (!isHexadecimal && IsSign(Peek()) && (fText[fAt - 1] == 'e' || fText[fAt - 1] == 'E'))) {
+        ++fAt;
+    }
+    return TQueryToken{TQueryToken::kNumber, fText.substr(begin, fAt - begin), begin};
+}
+
+TQueryToken TQueryLexer::ReadText()
+{
+    TQueryToken token{TQueryToken::kText, std::string(), fAt};
+    const char quote = fText[fAt++];
+    for (; fAt < fText.size(); ++fAt) {
+        if (fText[fAt] == quote) {
+            ++fAt;
+            return token;
+        }
+        const char next = Peek(1);
+        if (fText[fAt] == '\\' && (next == '\\' || next == '\'' || next == '"')) {
+            ++fAt;
+        }
+        token.fText.push_back(fText[fAt]);
+    }
+    throw TQueryError(TZELStatusCode::kInvalidQuery, "the text that begins here has no second quote", token.fPosition);
+}
+
+TQueryToken TQueryLexer::ReadSymbol()
+{
+    const std::size_t begin = fAt;
+    const std::string two = fText.substr(begin, 2);
+    if (two == "<>" || two == "<=" || two == ">=" || two == "!=") {
+        fAt += 2;
+        return TQueryToken{TQueryToken::kSymbol, two, begin};
+    }
+    if (std::string("=<>(),.*").find(fText[begin]) == std::string::npos) {
+        throw TQueryError(TZELStatusCode::kInvalidQuery, "a query has no '" + fText.substr(begin, 1) + "' here", begin);
+    }
+    ++fAt;
+    return TQueryToken{TQueryToken::kSymbol, fText.substr(begin, 1), begin};
+}
+
+}  // namespace NORVZEL20

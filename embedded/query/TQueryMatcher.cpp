@@ -1,0 +1,203 @@
+#include "embedded/query/TQueryMatcher.h"
+
+#include <algorithm>
+
+#include "embedded/query/TQueryComparison.h"
+#include "embedded/query/TQueryError.h"
+#include "embedded/store/TInMemNamespace.h"
+#include "embedded/value/TEmbeddedObject.h"
+#include "embedded/value/TNameText.h"
+#include "embedded/value/TValueText.h"
+#include "host/TCIMReference.h"
+
+namespace NORVZEL20 {
+
+namespace {
+
+using TType = TCIMValue::TCIMType;
+
+std::string Describe(const TQueryOperand& operand, TType type)
+{
+    const std::string name = operand.fName.empty() ? "the value" : "'" + operand.fName + "'";
+    return name + " (" + TValueText::GetTypeName(type) + (type.IsArray() ? " array)" : ")");
+}
+
+[[noreturn]] void Refuse(const std::string& message, std::size_t position)
+{
+    throw TQueryError(TZELStatusCode::kInvalidQuery, message, position);
+}
+
+}  // namespace
+
+TQueryMatcher::TQueryMatcher(const TQueryCondition& condition, const TInMemClass& cls) : fCondition(condition), fClass(cls)
+{
+    Bind(condition);
+}
+
+void TQueryMatcher::Bind(const TQueryCondition& condition)
+{
+    for (const auto& part : condition.fParts) {
+        Bind(*part);
+    }
+    for (const TQueryOperand& operand : condition.fOperands) {
+        if (!operand.fName.empty()) {
+            fSlots.resize(std::max(fSlots.size(), operand.fOrdinal + 1), TInMemClass::kNoSlot);
+            fSlots[operand.fOrdinal] = fClass.FindSlot(operand.fName);
+        }
+    }
+    if (condition.fKind == TQueryCondition::kLike) {
+        CheckText(condition);
+    } else if (condition.fKind == TQueryCondition::kIsA) {
+        CheckIsA(condition);
+    } else if (condition.fOperands.size() == 2) {
+        CheckComparison(condition);
+    }
+}
+
+TType TQueryMatcher::GetType(const TQueryOperand& operand) const
+{
+    if (operand.fName.empty()) {
+        return operand.fLiteral.GetType();
+    }
+    const std::uint32_t slot = fSlots[operand.fOrdinal];
+    return slot == TInMemClass::kNoSlot ? TType(TType::kNone) : fClass.GetSlotDecl(slot).GetType();
+}
+
+void TQueryMatcher::CheckComparison(const TQueryCondition& test) const
+{
+    const TQueryOperand& left = test.fOperands[0];
+    const TQueryOperand& right = test.fOperands[1];
+    const TType leftType = GetType(left);
+    const TType rightType = GetType(right);
+    const bool isOrder = test.fKind != TQueryCondition::kEqual && test.fKind != TQueryCondition::kNotEqual;
+    if (!TQueryComparison::AreComparable(leftType, rightType)) {
+        Refuse(Describe(left, leftType) + " and " + Describe(right, rightType) + " do not compare", test.fPosition);
+    }
+    if (isOrder && !TQueryComparison::AreOrdered(leftType, rightType)) {
+        Refuse(Describe(left, leftType) + " and " + Describe(right, rightType) + " have no order", test.fPosition);
+    }
+    for (const auto& [literal, type] : {std::make_pair(&left, rightType), std::make_pair(&right, leftType)}) {
+        if (literal->fName.empty() && !TQueryComparison::IsReadable(literal->fLiteral, type)) {
+            Refuse("'" + literal->fLiteral.ToText() + "' is no datetime", literal->fPosition);
+        }
+    }
+}
+
+void TQueryMatcher::CheckText(const TQueryCondition& test) const
+{
+    const TType type = GetType(test.fOperands[0]);
+    if (type != TType::kString && type != TType::kNone) {
+        Refuse("LIKE needs text, " + Describe(test.fOperands[0], type) + " is none", test.fPosition);
+    }
+}
+
+void TQueryMatcher::CheckIsA(const TQueryCondition& test) const
+{
+    const TType type = GetType(test.fOperands[0]);
+    if (!test.fOperands[0].fIsClass && type != TType::kString && type != TType::kReference && type != TType::kNone) {
+        Refuse("ISA needs an embedded object or a reference, " + Describe(test.fOperands[0], type) + " is none", test.fPosition);
+    }
+}
+
+const TCIMValue& TQueryMatcher::GetValue(const TQueryOperand& operand, const TInMemInstance& instance) const
+{
+    if (operand.fName.empty()) {
+        return operand.fLiteral;
+    }
+    static const TCIMValue fgNull;
+    const std::uint32_t slot = fSlots[operand.fOrdinal];
+    return slot == TInMemClass::kNoSlot ? fgNull : instance.GetSlotValue(slot);
+}
+
+TQueryMatcher::ETruth TQueryMatcher::Evaluate(const TQueryCondition& condition, const TInMemInstance& instance) const
+{
+    switch (condition.fKind) {
+    case TQueryCondition::kOr:
+    case TQueryCondition::kAnd:
+        return EvaluateParts(condition, instance);
+    case TQueryCondition::kNot:
+        return ETruth(kTrue - Evaluate(*condition.fParts[0], instance));
+    case TQueryCondition::kIsNull:
+        return GetValue(condition.fOperands[0], instance).IsNull() ? kTrue : kFalse;
+    case TQueryCondition::kLike:
+        return EvaluateLike(condition, instance);
+    case TQueryCondition::kIsA:
+        return EvaluateIsA(condition, instance);
+    default:
+        return EvaluateComparison(condition, instance);
+    }
+}
+
+TQueryMatcher::ETruth TQueryMatcher::EvaluateParts(const TQueryCondition& condition, const TInMemInstance& instance) const
+{
+    const bool isOr = condition.fKind == TQueryCondition::kOr;
+    const ETruth decisive = isOr ? kTrue : kFalse;
+    ETruth result = isOr ? kFalse : kTrue;
+    for (const auto& part : condition.fParts) {
+        const ETruth truth = Evaluate(*part, instance);
+        if (truth == decisive) {
+            return decisive;
+        }
+        result = truth == kUnknown ? kUnknown : result;
+    }
+    return result;
+}
+
+TQueryMatcher::ETruth TQueryMatcher::EvaluateComparison(const TQueryCondition& test, const TInMemInstance& instance) const
+{
+    const auto result = TQueryComparison::Compare(GetValue(test.fOperands[0], instance), GetValue(test.fOperands[1], instance));
+    const auto isOne = [result](TQueryComparison::EResult a, TQueryComparison::EResult b) { return result == a || result == b; };
+    if (result == TQueryComparison::kUnknown) {
+        return kUnknown;
+    }
+    switch (test.fKind) {
+    case TQueryCondition::kEqual:
+        return result == TQueryComparison::kEqual ? kTrue : kFalse;
+    case TQueryCondition::kNotEqual:
+        return result != TQueryComparison::kEqual ? kTrue : kFalse;
+    case TQueryCondition::kLess:
+        return result == TQueryComparison::kLess ? kTrue : kFalse;
+    case TQueryCondition::kLessOrEqual:
+        return isOne(TQueryComparison::kLess, TQueryComparison::kEqual) ? kTrue : kFalse;
+    case TQueryCondition::kGreater:
+        return result == TQueryComparison::kGreater ? kTrue : kFalse;
+    default:
+        return isOne(TQueryComparison::kGreater, TQueryComparison::kEqual) ? kTrue : kFalse;
+    }
+}
+
+TQueryMatcher::ETruth TQueryMatcher::EvaluateLike(const TQueryCondition& test, const TInMemInstance& instance) const
+{
+    const TCIMValue& value = GetValue(test.fOperands[0], instance);
+    if (value.IsNull() || value.GetEmbeddedObject()) {
+        return kUnknown;
+    }
+    return test.fPattern->Matches(value.GetString()) ? kTrue : kFalse;
+}
+
+TQueryMatcher::ETruth TQueryMatcher::EvaluateIsA(const TQueryCondition& test, const TInMemInstance& instance) const
+{
+    if (test.fOperands[0].fIsClass) {
+        return fClass.IsSubclassOf(test.fClassName) ? kTrue : kFalse;
+    }
+    const TCIMValue& value = GetValue(test.fOperands[0], instance);
+    if (value.IsNull()) {
+        return kUnknown;
+    }
+    if (value.GetType() == TType::kReference) {
+        const TCIMReference path = value;
+        return IsA(path.GetClassName(), test.fClassName) ? kTrue : kFalse;
+    }
+    const auto object = value.GetEmbeddedObject();
+    return object && IsA(object->GetClassName(), test.fClassName) ? kTrue : kFalse;
+}
+
+/// Whether the class named, which need not be declared, is the wanted one or below it.
+bool TQueryMatcher::IsA(std::string_view className, std::string_view wanted) const
+{
+    const auto ns = fClass.GetInMemNamespace();
+    const auto cls = ns ? ns->FindClass(className) : nullptr;
+    return cls ? cls->IsSubclassOf(wanted) : TNameText::Equal(className, wanted);
+}
+
+}  // namespace NORVZEL20

@@ -1,0 +1,30 @@
+#include <boost/assert.hpp>
+#include <string>
+
+#include "embedded/services/TAssertionFailure.h"
+#include "embedded/services/TCoreLog.h"
+
+namespace {
+
+[[noreturn]] void Fail(const std::string& what, const char* function, const char* file, long line)
+{
+    const std::string text = what + " in " + function + ", " + file + " line " + std::to_string(line);
+    NORVZEL20::TCoreLog::Get()->Log(0, text);
+    throw NORVZEL20::TAssertionFailure(text);
+}
+
+}  // namespace
+
+namespace boost {
+
+void assertion_failed(const char* expression, const char* function, const char* file, long line)
+{
+    Fail(std::string("Assertion failed: ") + expression, function, file, line);
+}
+
+void assertion_failed_msg(const char* expression, const char* message, const char* function, const char* file, long line)
+{
+    Fail(std::string("Assertion failed: ") + expression + " (" + message + ")", function, file, line);
+}
+
+}  // namespace boost

@@ -1,0 +1,74 @@
+#include "embedded/store/THashIndex.h"
+
+namespace NORVZEL20 {
+
+void THashIndex::Place(std::vector<TEntry>& entries, std::size_t at, TEntry entry) noexcept
+{
+    while (entries[at].ordinal != kNone) {
+        at = (at + 1) & (entries.size() - 1);
+    }
+    entries[at] = entry;
+}
+
+void THashIndex::Reserve(std::size_t count)
+{
+    std::size_t size = fEntries.empty() ? 4 : fEntries.size();
+    while (count * 5 > size * 4) {
+        size *= 2;
+    }
+    if (size == fEntries.size()) {
+        return;
+    }
+    std::vector<TEntry> grown(size, TEntry{0, kNone});
+    grown.swap(fEntries);
+    for (const TEntry& entry : grown) {
+        if (entry.ordinal != kNone) {
+            Place(fEntries, Home(entry.hash), entry);
+        }
+    }
+}
+
+void THashIndex::Add(std::uint32_t hash, std::uint32_t ordinal)
+{
+    Reserve(fCount + 1);
+    Place(fEntries, Home(hash), TEntry{hash, ordinal});
+    ++fCount;
+}
+
+void THashIndex::Remove(std::uint32_t hash, std::uint32_t ordinal) noexcept
+{
+    if (fEntries.empty()) {
+        return;
+    }
+    std::size_t hole = Home(hash);
+    while (fEntries[hole].ordinal != ordinal) {
+        if (fEntries[hole].ordinal == kNone) {
+            return;
+        }
+        hole = Next(hole);
+    }
+    // Whatever follows without a gap moves up into the hole, unless its home lies behind it.
+    const std::size_t mask = fEntries.size() - 1;
+    for (std::size_t at = Next(hole); fEntries[at].ordinal != kNone; at = Next(at)) {
+        if (((at - Home(fEntries[at].hash)) & mask) >= ((at - hole) & mask)) {
+            fEntries[hole] = fEntries[at];
+            hole = at;
+        }
+    }
+    fEntries[hole].ordinal = kNone;
+    --fCount;
+}
+
+void THashIndex::Clear() noexcept
+{
+    std::vector<TEntry>().swap(fEntries);
+    fCount = 0;
+}
+
+void THashIndex::Swap(THashIndex& other) noexcept
+{
+    fEntries.swap(other.fEntries);
+    std::swap(fCount, other.fCount);
+}
+
+}  // namespace NORVZEL20

@@ -1,0 +1,48 @@
+#pragma once
+
+#include <boost/function.hpp>
+#include <boost/smart_ptr/shared_ptr.hpp>
+#include <string>
+
+#include "embedded/store/TInMemQualifierSet.h"
+#include "host/ICIMClass.h"
+#include "host/ICIMMethodDecl.h"
+#include "host/ICIMNamedElement.h"
+#include "host/ICIMPropertyDecl.h"
+
+namespace NORVZEL20 {
+
+/// The qualifier operations of ICIMNamedElement, for classes, properties, methods and parameters alike.
+template <class TInterface>
+class TInMemNamedElement : public TInterface {
+  public:
+    /// Errors: status 5 for null.
+    void AddQualifier(boost::shared_ptr<ICIMQualifier> qualifier, TCallContext context) override;
+    boost::shared_ptr<ICIMQualifier> AllocateQualifier(boost::shared_ptr<const ICIMQualifierDecl> decl, const TCIMValue& value,
+                                                       TCallContext context) const override;
+    boost::shared_ptr<ICIMQualifier> AllocateQualifier(boost::shared_ptr<const ICIMQualifierDecl> decl, const TCIMValue& value,
+                                                       ICIMQualifierDecl::EFlavor flavor, TCallContext context) const override;
+    boost::shared_ptr<ICIMQualifier> GetQualifier(const std::string& name, TCallContext context) const override;
+    boost::shared_ptr<ICIMQualifier> GetQualifier(const std::string& name, bool& found, TCallContext context) const override;
+    void EnumerateQualifiers(const boost::function<bool(boost::shared_ptr<ICIMQualifier>)>& callback,
+                             TCallContext context) const override;
+
+    const TInMemQualifierSet& GetQualifiers() const noexcept { return fQualifiers; }
+    /// As AddQualifier.
+    void AddQualifier(boost::shared_ptr<ICIMQualifier> qualifier);
+
+  protected:
+    /// Adds one that is not null, wholly or not at all; for elements that derive something from their qualifiers to override.
+    virtual void PutQualifier(boost::shared_ptr<ICIMQualifier> qualifier) { fQualifiers.Add(std::move(qualifier)); }
+    void InheritQualifiers(const TInMemQualifierSet* parent) noexcept { fQualifiers.SetParent(parent); }
+
+  private:
+    TInMemQualifierSet fQualifiers;
+};
+
+extern template class TInMemNamedElement<ICIMNamedElement>;
+extern template class TInMemNamedElement<ICIMClass>;
+extern template class TInMemNamedElement<ICIMPropertyDecl>;
+extern template class TInMemNamedElement<ICIMMethodDecl>;
+
+}  // namespace NORVZEL20

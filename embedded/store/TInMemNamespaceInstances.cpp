@@ -1,0 +1,101 @@
+// Finding, changing and removing instances by path.
+
+#include "embedded/store/TInMemNamespace.h"
+#include "embedded/value/TValueText.h"
+#include "host/TZELException.h"
+
+namespace NORVZEL20 {
+
+namespace {
+
+TCIMValue GetKey(const TCIMReference& path, const TInMemPropertyDecl& decl)
+{
+    const TCIMValue* const bound = path.FindKeyValue(decl.GetName());
+    if (!bound) {
+        throw TZELException(TZELStatusCode::kKeyMissing);
+    }
+    TCIMValue key;
+    if (!TValueText::Convert(*bound, decl.GetType(), key)) {
+        throw TZELException(TZELStatusCode::kTypeMismatch);
+    }
+    return key;
+}
+
+}  // namespace
+
+boost::shared_ptr<TInMemInstance> TInMemNamespace::FindInstance(const TCIMReference& path) const
+{
+    const auto cls = FindClass(path.GetClassName());
+    if (!cls) {
+        return nullptr;
+    }
+    std::vector<TCIMValue> keys;
+    keys.reserve(cls->GetKeySlots().size());
+    for (const std::uint32_t slot : cls->GetKeySlots()) {
+        keys.push_back(GetKey(path, cls->GetSlotDecl(slot)));
+    }
+    return path.GetKeyCount() == keys.size() ? cls->GetExtent().Find(keys) : nullptr;
+}
+
+boost::shared_ptr<TInMemInstance> TInMemNamespace::RequireInstance(const TCIMReference& path) const
+{
+    auto instance = FindInstance(path);
+    if (!instance) {
+        throw TZELException(TZELStatusCode::kNotFound);
+    }
+    return instance;
+}
+
+boost::shared_ptr<ICIMInstance> TInMemNamespace::GetInstance(const TCIMReference& path, TCallContext) const
+{
+    return RequireInstance(path);
+}
+
+void TInMemNamespace::DeleteInstance(const TCIMReference& path, TCallContext)
+{
+    const auto instance = RequireInstance(path);
+    instance->GetInMemClass()->GetExtent().Remove(*instance);
+}
+
+void TInMemNamespace::ModifyInstance(const TCIMReference& path, TCallContext properties, TCallContext)
+{
+    const auto instance = RequireInstance(path);
+    const TInMemClass& cls = *instance->GetInMemClass();
+    std::vector<std::pair<std::uint32_t, TCIMValue>> changes;
+    for (const auto& [name, value] : properties) {
+        const std::uint32_t slot = cls.FindSlot(name);
+        if (slot == TInMemClass::kNoSlot) {
+            throw TZELException(TZELStatusCode::kNotFound);
+        }
+        TCIMValue fitting = cls.GetSlotDecl(slot).Fit(value);
+        if (!cls.GetSlotDecl(slot).IsKey()) {
+            changes.emplace_back(slot, std::move(fitting));
+        } else if (instance->GetSlotValue(slot) != fitting) {
+            throw TZELException(TZELStatusCode::kInvalidParameter);
+        }
+    }
+    for (auto& [slot, value] : changes) {
+        instance->SetSlot(slot, std::move(value));
+    }
+}
+
+void TInMemNamespace::ClearInstances()
+{
+    for (auto& [name, entry] : fClassesByName) {
+        entry.extent->Clear();
+    }
+}
+
+void TInMemNamespace::ReferenceTextsChanged()
+{
+    for (const auto& cls : fClasses) {
+        for (const std::uint32_t slot : cls->GetKeySlots()) {
+            if (cls->GetSlotDecl(slot).GetType().GetElementType() == TCIMValue::TCIMType::kReference) {
+                cls->GetExtent().KeysChanged();
+                break;
+            }
+        }
+    }
+}
+
+}  // namespace NORVZEL20

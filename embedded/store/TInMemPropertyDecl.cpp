@@ -1,0 +1,138 @@
+#include "embedded/store/TInMemPropertyDecl.h"
+
+#include <algorithm>
+
+#include "embedded/store/TInMemClass.h"
+#include "embedded/value/TNameText.h"
+#include "host/TCIMReference.h"
+#include "host/TZELException.h"
+
+namespace NORVZEL20 {
+
+TInMemPropertyDecl::TInMemPropertyDecl(const std::string& name, const TCIMValue& value)
+    : fName(name), fDefault(WithoutClasses(value)), fStaticProperty(*this)
+{
+    if (value.GetType() == TCIMValue::TCIMType::kReference && !value.IsNull()) {
+        const TCIMReference path = value;
+        fReferenceClass = path.GetClassName();
+        if (path.GetKeyCount() == 0) {
+            fDefault = TCIMValue::Null(value.GetType());
+        }
+    }
+    fStaticProperty.fState.value = fDefault;
+    UpdateMarks();
+}
+
+const std::string& TInMemPropertyDecl::GetName(TCallContext) const
+{
+    return fName;
+}
+
+TCIMValue::TCIMType TInMemPropertyDecl::GetType(TCallContext) const
+{
+    return GetType();
+}
+
+const TCIMValue& TInMemPropertyDecl::GetDefaultValue(TCallContext) const
+{
+    return fDefault;
+}
+
+TCIMValue TInMemPropertyDecl::Fit(TCIMValue value) const
+{
+    if (value.IsNull()) {
+        return TCIMValue::Null(GetType());
+    }
+    if (value.GetType() != GetType()) {
+        throw TZELException(TZELStatusCode::kTypeMismatch);
+    }
+    if (fBag) {
+        return value.AsBag();
+    }
+    return value;
+}
+
+TCIMValue TInMemPropertyDecl::WithoutClasses(TCIMValue value)
+{
+    if (value.IsNull()) {
+        return value;
+    }
+    if (value.GetType() == TCIMValue::TCIMType::kReference) {
+        TCIMReference path = value;
+        path.SetClassName(std::string(path.GetClassName()));
+        return TCIMValue(path);
+    }
+    if (value.GetType() != TCIMValue::TCIMType::kArrayReference) {
+        return value;
+    }
+    std::vector<TCIMValue> elements;
+    for (const TCIMValue& element : value.GetElements()) {
+        elements.push_back(WithoutClasses(element));
+    }
+    const TCIMValue copy(value.GetType(), unsigned(elements.size()), elements);
+    return value.IsBag() ? copy.AsBag() : copy;
+}
+
+void TInMemPropertyDecl::SetSpelling(const std::string& name)
+{
+    if (!TNameText::Equal(name, fName)) {
+        throw TZELException(TZELStatusCode::kInvalidParameter);
+    }
+    std::copy(name.begin(), name.end(), fName.begin());
+}
+
+void TInMemPropertyDecl::PutQualifier(boost::shared_ptr<ICIMQualifier> qualifier)
+{
+    const auto owner = fOwner.lock();
+    if (owner && TInMemQualifierSet::IsNamed(*qualifier, "Key") && !TInMemQualifierSet::HoldsTrue(*qualifier)) {
+        owner->CheckKeyStays(*this);
+    }
+    const auto below = owner ? owner->PrepareChange() : std::vector<boost::shared_ptr<TInMemClass>>();
+    TInMemNamedElement<ICIMPropertyDecl>::PutQualifier(std::move(qualifier));
+    UpdateMarks();
+    if (owner) {
+        owner->DeclChanged(*this, below);
+    }
+}
+
+/// Whether it would still be a key if `other`, this one or one that it overrides, did not say so.
+bool TInMemPropertyDecl::IsKeyWithout(const TInMemPropertyDecl& other) const
+{
+    for (const TInMemPropertyDecl* decl = this; decl; decl = decl->fOverridden.get()) {
+        if (decl != &other && decl->GetQualifiers().IsOwnTrue("Key")) {
+            return true;
+        }
+    }
+    return false;
+}
+
+void TInMemPropertyDecl::UpdateMarks()
+{
+    const TInMemQualifierSet& qualifiers = GetQualifiers();
+    fKey = qualifiers.IsTrueAnywhere("Key");
+    fStatic = qualifiers.IsTrueAnywhere("Static");
+    fGenerated = fKey && GetType() == TCIMValue::TCIMType::kUint64 && qualifiers.IsTrue("Generated");
+    fBag = GetType().IsArray() && IsBagDeclared();
+}
+
+bool TInMemPropertyDecl::IsBagDeclared() const
+{
+    if (GetQualifiers().IsTrue("OctetString")) {
+        return false;
+    }
+    const auto arrayType = GetQualifiers().Find("ArrayType");
+    if (!arrayType) {
+        return true;
+    }
+    const TCIMValue& value = arrayType->GetValue(TCallContext());
+    return value.IsNull() || value.GetType() != TCIMValue::TCIMType::kString || TNameText::Equal(value.GetString(), "Bag");
+}
+
+void TInMemPropertyDecl::Override(boost::shared_ptr<TInMemPropertyDecl> overridden)
+{
+    fOverridden = std::move(overridden);
+    InheritQualifiers(fOverridden ? &fOverridden->GetQualifiers() : nullptr);
+    UpdateMarks();
+}
+
+}  // namespace NORVZEL20

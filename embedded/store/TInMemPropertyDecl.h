@@ -1,0 +1,87 @@
+#pragma once
+
+#include <boost/smart_ptr/enable_shared_from_this.hpp>
+#include <boost/smart_ptr/weak_ptr.hpp>
+#include <string>
+
+#include "embedded/store/TInMemNamedElement.h"
+#include "embedded/store/TInMemStaticProperty.h"
+#include "host/ICIMPropertyDecl.h"
+
+namespace NORVZEL20 {
+
+class TInMemClass;
+
+/// A property's declaration in an in-memory class.
+///
+/// Made by TInMemClass::AllocatePropertyDecl, given its qualifiers, then added with TInMemClass::AddPropertyDecl. From then on
+/// AddQualifier throws status 19 where a Key that is not true would take a key away from a class with instances.
+class TInMemPropertyDecl : public TInMemNamedElement<ICIMPropertyDecl>, public boost::enable_shared_from_this<TInMemPropertyDecl> {
+  public:
+    /// The value gives type and default. A reference in it names the class that references point to; without keys it is no default.
+    TInMemPropertyDecl(const std::string& name, const TCIMValue& value);
+
+    const std::string& GetName(TCallContext context) const override;
+    TCIMValue::TCIMType GetType(TCallContext context) const override;
+    const TCIMValue& GetDefaultValue(TCallContext context) const override;
+
+    const std::string& GetName() const noexcept { return fName; }
+    TCIMValue::TCIMType GetType() const noexcept { return fDefault.GetType(); }
+    const TCIMValue& GetDefaultValue() const noexcept { return fDefault; }
+
+    /// The class that references point to; empty for other types and where none was named.
+    const std::string& GetReferenceClass() const noexcept { return fReferenceClass; }
+    void SetReferenceClass(const std::string& name) { fReferenceClass = name; }
+    /// The number of elements of a fixed array; 0 where it is not fixed.
+    unsigned int GetArraySize() const noexcept { return fArraySize; }
+    void SetArraySize(unsigned int size) noexcept { fArraySize = size; }
+
+    bool IsKey() const noexcept { return fKey; }
+    bool IsStatic() const noexcept { return fStatic; }
+    /// Whether an array in it compares without regard to order: ArrayType "Bag" or none, and not OctetString.
+    bool IsBag() const noexcept { return fBag; }
+    /// Whether a null is replaced by the next number of the class when an instance is added: a uint64 key with Generated(true).
+    bool IsGenerated() const noexcept { return fGenerated; }
+
+    /// The value as the property holds it: nulls typed, bags marked. Errors: status 13 where the type is not the declared one.
+    TCIMValue Fit(TCIMValue value) const;
+
+    /// The value with a stub in the place of each class that a reference in it holds. A class owns its declarations, so that a
+    /// value kept in one of them must not own the class.
+    static TCIMValue WithoutClasses(TCIMValue value);
+
+    /// Spells the name another way. Errors: status 5 where more than letter case differs.
+    void SetSpelling(const std::string& name);
+
+    /// The declaration of an ancestor that this one overrides, from which it inherits qualifiers; null for none.
+    const boost::shared_ptr<TInMemPropertyDecl>& GetOverridden() const noexcept { return fOverridden; }
+
+    /// The class that declares it; null before it is added to one, and where that is gone.
+    boost::shared_ptr<TInMemClass> GetOwner() const { return fOwner.lock(); }
+
+    /// The one value of a property with the qualifier Static; an ordinary property's is null and of no use.
+    TInMemStaticProperty& GetStaticProperty() noexcept { return fStaticProperty; }
+
+  private:
+    friend class TInMemClass;
+
+    void PutQualifier(boost::shared_ptr<ICIMQualifier> qualifier) override;
+    void UpdateMarks();
+    bool IsBagDeclared() const;
+    bool IsKeyWithout(const TInMemPropertyDecl& other) const;
+    void Override(boost::shared_ptr<TInMemPropertyDecl> overridden);
+
+    std::string fName;
+    std::string fReferenceClass;
+    TCIMValue fDefault;
+    unsigned int fArraySize = 0;
+    bool fKey = false;
+    bool fStatic = false;
+    bool fBag = false;
+    bool fGenerated = false;
+    boost::shared_ptr<TInMemPropertyDecl> fOverridden;
+    boost::weak_ptr<TInMemClass> fOwner;  // the class it has been added to
+    TInMemStaticProperty fStaticProperty;
+};
+
+}  // namespace NORVZEL20

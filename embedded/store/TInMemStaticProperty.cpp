@@ -1,0 +1,42 @@
+#include "embedded/store/TInMemStaticProperty.h"
+
+#include "embedded/store/TInMemPropertyDecl.h"
+
+namespace NORVZEL20 {
+
+const TCIMValue& TInMemStaticProperty::GetValue(TCallContext) const
+{
+    return fState.value;
+}
+
+void TInMemStaticProperty::SetValue(const TCIMValue& value)
+{
+    fState.value = TInMemPropertyDecl::WithoutClasses(fDecl.Fit(value));
+}
+
+void TInMemStaticProperty::SetValue(const TCIMValue& value, TCallContext)
+{
+    SetValue(value);
+}
+
+void TInMemStaticProperty::MarkRemoved()
+{
+    fState.isRemoved = true;
+}
+
+void TInMemStaticProperty::MarkChanged(const TCIMValue& value)
+{
+    const TCIMValue before = fState.value;
+    SetValue(value);
+    if (!fState.isChanged) {
+        fState.earlier = before;
+        fState.isChanged = true;
+    }
+}
+
+boost::shared_ptr<const ICIMPropertyDecl> TInMemStaticProperty::GetPropertyDecl(TCallContext) const
+{
+    return fDecl.shared_from_this();
+}
+
+}  // namespace NORVZEL20

@@ -1,0 +1,243 @@
+#include "host/TCIMReference.h"
+
+#include <algorithm>
+#include <boost/smart_ptr/make_shared.hpp>
+
+#include "embedded/value/ILocated.h"
+#include "embedded/value/TNameText.h"
+#include "embedded/value/TReferenceContents.h"
+#include "embedded/value/TStubClass.h"
+#include "embedded/value/TValueAccess.h"
+#include "host/TZELException.h"
+
+namespace NORVZEL20 {
+
+namespace {
+
+constexpr std::size_t kUsualNumberLength = 10;
+
+const std::string& GetEmptyText()
+{
+    static const std::string* const fgEmpty = new std::string;
+    return *fgEmpty;
+}
+
+std::string TrimSlashes(const std::string& name)
+{
+    const std::size_t first = name.find_first_not_of('/');
+    return first == std::string::npos ? std::string() : name.substr(first, name.find_last_not_of('/') + 1 - first);
+}
+
+}  // namespace
+
+TCIMReference::TCIMReference() : fContents(nullptr) {}
+
+TCIMReference::TCIMReference(TContents* contents) noexcept : fContents(contents) {}
+
+TCIMReference::TCIMReference(boost::shared_ptr<ICIMNamespace> ns, std::map<std::string, TCIMValue> keys) : fContents(nullptr)
+{
+    TCIMReference path(new TContents);  // owns the contents while they are filled
+    if (ns) {
+        TContents::TPlace& place = path.fContents->OwnPlace();
+        place.fNamespace = ns;
+        if (const auto* const located = dynamic_cast<const ILocated*>(ns.get())) {
+            place.fNamespaceName = TrimSlashes(located->GetNamespaceName());
+        }
+    }
+    path.fContents->fBindings.reserve(keys.size());
+    for (const auto& [name, value] : keys) {
+        path.AddKeyValue(name, value);
+    }
+    std::swap(fContents, path.fContents);
+}
+
+TCIMReference::TCIMReference(const TCIMReference& other) noexcept : fContents(other.fContents)
+{
+    if (fContents != nullptr) {
+        fContents->Acquire();
+    }
+}
+
+TCIMReference& TCIMReference::operator=(const TCIMReference& other) noexcept
+{
+    TCIMReference copy(other);
+    std::swap(fContents, copy.fContents);
+    return *this;
+}
+
+TCIMReference::~TCIMReference()
+{
+    if (fContents != nullptr && fContents->Release()) {
+        delete fContents;
+    }
+}
+
+TCIMReference::TContents& TCIMReference::Own()
+{
+    if (fContents == nullptr) {
+        fContents = new TContents;
+    } else if (!fContents->IsUnique()) {
+        TCIMReference copy(new TContents(*fContents));
+        std::swap(fContents, copy.fContents);
+    }
+    return *fContents;
+}
+
+void TCIMReference::AddKeyValue(const std::string& name, const TCIMValue& value)
+{
+    const unsigned int depth = TContents::GetDepth(value);
+    if (depth > TContents::kMaxDepth) {
+        throw TZELException(TZELStatusCode::kInvalidParameter);
+    }
+    TContents& contents = Own();
+    auto& bindings = contents.fBindings;
+    const auto place =
+        std::lower_bound(bindings.begin(), bindings.end(), name, [](const TContents::TBinding& binding, const std::string& wanted) {
+            return TNameText::Compare(binding.first, wanted) < 0;
+        });
+    if (place != bindings.end() && TNameText::Equal(place->first, name)) {
+        place->second = value;
+    } else {
+        bindings.emplace(place, name, value);
+    }
+    contents.fDepth = std::max(contents.fDepth, depth);
+}
+
+void TCIMReference::EnumerateKeyBindings(const boost::function<bool(std::pair<std::string, TCIMValue>)>& callback) const
+{
+    const TCIMReference held(*this);  // the callback may change or destroy this path
+    if (held.fContents == nullptr) {
+        return;
+    }
+    for (const TContents::TBinding& binding : held.fContents->fBindings) {
+        if (!callback(binding)) {
+            return;
+        }
+    }
+}
+
+boost::shared_ptr<ICIMClass> TCIMReference::GetClass() const
+{
+    return fContents != nullptr ? fContents->fClass : nullptr;
+}
+
+void TCIMReference::SetClass(boost::shared_ptr<ICIMClass> cls)
+{
+    Own().fClass = std::move(cls);
+}
+
+std::string TCIMReference::GetPath() const
+{
+    std::string path;
+    path.reserve(EstimateLength());
+    AppendPath(path);
+    return path;
+}
+
+std::size_t TCIMReference::EstimateLength() const
+{
+    std::size_t length = GetHost().size() + GetNamespaceName().size() + GetClassName().size() + 4;
+    for (std::size_t i = 0; i < GetKeyCount(); ++i) {
+        const auto& [name, value] = fContents->fBindings[i];
+        length += name.size() + 4 + (TValueAccess::IsText(value) ? TValueAccess::GetText(value).size() : kUsualNumberLength);
+    }
+    return length;
+}
+
+void TCIMReference::AppendPath(std::string& out) const
+{
+    if (fContents == nullptr) {
+        return;
+    }
+    if (!GetHost().empty()) {
+        out.append("//").append(GetHost()).append(1, '/');
+    }
+    if (!GetNamespaceName().empty()) {
+        out.append(GetNamespaceName()).append(1, ':');
+    }
+    out += GetClassName();
+    char separator = '.';
+    for (const TContents::TBinding& binding : fContents->fBindings) {
+        out.append(1, separator).append(binding.first).append(1, '=');
+        binding.second.AppendKeyText(out);
+        separator = ',';
+    }
+}
+
+boost::shared_ptr<ICIMNamespace> TCIMReference::GetNamespace() const
+{
+    return fContents != nullptr && fContents->fPlace ? fContents->fPlace->fNamespace.lock() : nullptr;
+}
+
+const std::string& TCIMReference::GetNamespaceName() const
+{
+    return fContents != nullptr && fContents->fPlace ? fContents->fPlace->fNamespaceName : GetEmptyText();
+}
+
+void TCIMReference::SetNamespaceName(const std::string& name)
+{
+    std::string trimmed = TrimSlashes(name);
+    TContents::TPlace& place = Own().OwnPlace();
+    if (!TNameText::Equal(place.fNamespaceName, trimmed)) {
+        place.fNamespace.reset();
+    }
+    place.fNamespaceName = std::move(trimmed);
+}
+
+const std::string& TCIMReference::GetHost() const
+{
+    return fContents != nullptr && fContents->fPlace ? fContents->fPlace->fHost : GetEmptyText();
+}
+
+void TCIMReference::SetHost(const std::string& host)
+{
+    Own().OwnPlace().fHost = host;
+}
+
+const std::string& TCIMReference::GetClassName() const
+{
+    return fContents != nullptr && fContents->fClass ? fContents->fClass->GetName(TCallContext()) : GetEmptyText();
+}
+
+void TCIMReference::SetClassName(const std::string& name)
+{
+    SetClass(name.empty() ? nullptr : boost::make_shared<TStubClass>(name));
+}
+
+std::size_t TCIMReference::GetKeyCount() const
+{
+    return fContents != nullptr ? fContents->fBindings.size() : 0;
+}
+
+const TCIMValue* TCIMReference::FindKeyValue(const std::string& name) const
+{
+    if (fContents == nullptr) {
+        return nullptr;
+    }
+    const auto& bindings = fContents->fBindings;
+    const auto found = std::find_if(bindings.begin(), bindings.end(),
+                                    [&name](const TContents::TBinding& binding) { return TNameText::Equal(binding.first, name); });
+    return found != bindings.end() ? &found->second : nullptr;
+}
+
+unsigned int TCIMReference::TContents::GetDepth(const TCIMValue& value)
+{
+    switch (TValueAccess::GetForm(value)) {
+    case TValueAccess::kPath: {
+        const TContents* const contents = TValueAccess::GetPath(value).fContents;
+        return contents != nullptr ? contents->fDepth + 1 : 1;
+    }
+    case TValueAccess::kArray:
+    case TValueAccess::kBag: {
+        unsigned int depth = 0;
+        for (const TCIMValue& element : value.GetElements()) {
+            depth = std::max(depth, GetDepth(element));
+        }
+        return depth;
+    }
+    default:
+        return 0;
+    }
+}
+
+}  // namespace NORVZEL20

@@ -1,0 +1,239 @@
+#include <algorithm>
+#include <cstring>
+
+#include "embedded/value/TNameText.h"
+#include "embedded/value/TReferenceContents.h"
+#include "embedded/value/TStubClass.h"
+#include "embedded/value/TValueText.h"
+#include "host/TZELException.h"
+
+namespace NORVZEL20 {
+
+namespace {
+
+// [ "//" host "/" | "/" ] [ namespace ":" ] [ class ] [ "." key "=" value { "," key "=" value } | "=@" ]
+//
+// A value is text in double quotes, a character in single quotes, or a word: a number, TRUE, FALSE or NULL. A path without a class
+// has keys. The end of the namespace is the first colon, unless an equals sign or a quote comes first.
+class TPathReader {
+  public:
+    struct TBinding {
+        std::string fName;
+        TCIMValue fValue;
+        std::size_t fPosition;
+    };
+
+    explicit TPathReader(std::string_view text) : fText(text) {}
+
+    void Read()
+    {
+        ReadHost();
+        ReadNamespace();
+        fClassName = ReadName();
+        if (fClassName.empty() && Peek() != '.') {
+            Fail();
+        }
+        if (fText.substr(fPosition) == "=@") {
+            return;
+        }
+        if (fPosition < fText.size()) {
+            Expect('.');
+            ReadBindings();
+        }
+        SortBindings();
+    }
+
+    std::string_view GetHost() const { return fHost; }
+    std::string_view GetNamespaceName() const { return fNamespaceName; }
+    std::string_view GetClassName() const { return fClassName; }
+    std::vector<TBinding>& GetBindings() { return fBindings; }
+    std::size_t GetPosition() const { return fPosition; }
+
+  private:
+    [[noreturn]] static void Fail() { throw TZELException(TZELStatusCode::kParseError); }
+
+    char Peek() const { return fPosition < fText.size() ? fText[fPosition] : '\0'; }
+
+    void Expect(char c)
+    {
+        if (fPosition >= fText.size() || fText[fPosition] != c) {
+            Fail();
+        }
+        ++fPosition;
+    }
+
+    void ReadHost()
+    {
+        if (fText.substr(0, 2) != "//") {
+            fPosition = Peek() == '/' ? 1 : 0;
+            return;
+        }
+        fPosition = 2;
+        const std::size_t end = fText.find('/', fPosition);
+        if (end == std::string_view::npos || end == fPosition) {
+            Fail();
+        }
+        fHost = fText.substr(fPosition, end - fPosition);
+        fPosition = end + 1;
+    }
+
+    void ReadNamespace()
+    {
+        const std::size_t end = fText.find_first_of(":='\"", fPosition);
+        if (end != std::string_view::npos && fText[end] == ':') {
+            fNamespaceName = fText.substr(fPosition, end - fPosition);
+            fPosition = end + 1;
+        }
+    }
+
+    static bool IsNameCharacter(char c, bool isFirst)
+    {
+        const char lower = TNameText::ToLower(c);
+        return (lower >= 'a' && lower <= 'z') || c == '_' || static_cast<unsigned char>(c) >= 0x80 ||
+               (!isFirst && c >= '0' && c <= '9');
+    }
+
+    std::string_view ReadName()
+    {
+        const std::size_t start = fPosition;
+        while (fPosition < fText.size() && IsNameCharacter(fText[fPosition], fPosition == start)) {
+            ++fPosition;
+        }
+        return fText.substr(start, fPosition - start);
+    }
+
+    void ReadBindings()
+    {
+        while (true) {
+            const std::size_t start = fPosition;
+            const std::string_view name = ReadName();
+            if (name.empty()) {
+                Fail();
+            }
+            Expect('=');
+            fBindings.push_back({std::string(name), ReadValue(), start});
+            if (fPosition == fText.size()) {
+                return;
+            }
+            Expect(',');
+        }
+    }
+
+    TCIMValue ReadValue()
+    {
+        const std::size_t start = fPosition;
+        if (Peek() == '"') {
+            return TCIMValue(ReadQuoted('"'));
+        }
+        TCIMValue value;
+        const bool isRead =
+            Peek() == '\'' ? TValueText::Parse(TCIMValue::TCIMType::kChar16, ReadQuoted('\''), value) : ReadWord(value);
+        if (!isRead) {
+            fPosition = start;
+            Fail();
+        }
+        return value;
+    }
+
+    std::string ReadQuoted(char quote)
+    {
+        std::string text;
+        const char stops[] = {quote, '\\'};
+        for (++fPosition;;) {
+            const std::size_t stop = fText.find_first_of(std::string_view(stops, 2), fPosition);
+            if (stop == std::string_view::npos || (fText[stop] == '\\' && stop + 1 == fText.size())) {
+                fPosition = fText.size();
+                Fail();
+            }
+            text += fText.substr(fPosition, stop - fPosition);
+            fPosition = stop + 1;
+            if (fText[stop] == quote) {
+                return text;
+            }
+            text += fText[fPosition++];
+        }
+    }
+
+    bool ReadWord(TCIMValue& value)
+    {
+        const std::size_t end = std::min(fText.find(',', fPosition), fText.size());
+        const std::string_view word = fText.substr(fPosition, end - fPosition);
+        fPosition = end;
+        if (TNameText::Equal(word, "NULL")) {
+            return true;
+        }
+        using TType = TCIMValue::TCIMType;
+        if (TValueText::Parse(TType::kBoolean, word, value)) {
+            return true;
+        }
+        const bool hasSign = !word.empty() && (word[0] == '+' || word[0] == '-');
+        return TValueText::Parse(hasSign ? TType::kSint64 : TType::kUint64, word, value) ||
+               TValueText::Parse(TType::kReal64, word, value);
+    }
+
+    void SortBindings()
+    {
+        std::stable_sort(fBindings.begin(), fBindings.end(),
+                         [](const TBinding& a, const TBinding& b) { return TNameText::Compare(a.fName, b.fName) < 0; });
+        const auto repeated = std::adjacent_find(fBindings.begin(), fBindings.end(), [](const TBinding& a, const TBinding& b) {
+            return TNameText::Equal(a.fName, b.fName);
+        });
+        if (repeated != fBindings.end()) {
+            fPosition = std::next(repeated)->fPosition;
+            Fail();
+        }
+    }
+
+    std::string_view fText;
+    std::size_t fPosition = 0;
+    std::string_view fHost;
+    std::string_view fNamespaceName;
+    std::string_view fClassName;
+    std::vector<TBinding> fBindings;
+};
+
+boost::shared_ptr<ICIMClass> FindClass(ICIMNamespace& ns, const std::string& name)
+{
+    try {
+        return ns.GetClass(name, TCallContext());
+    } catch (const TZELException& failure) {
+        if (failure.GetStatusCode() != TZELStatusCode::kNotFound) {
+            throw;
+        }
+        return nullptr;
+    }
+}
+
+}  // namespace
+
+TCIMReference TCIMReference::Parse(const std::string& text, boost::shared_ptr<ICIMNamespace> ns, std::size_t* errorPosition)
+{
+    TPathReader reader(text);
+    try {
+        reader.Read();
+    } catch (const TZELException&) {
+        if (errorPosition != nullptr) {
+            *errorPosition = reader.GetPosition();
+        }
+        throw;
+    }
+    TCIMReference path(new TContents);
+    if (!reader.GetHost().empty()) {
+        path.SetHost(std::string(reader.GetHost()));
+    }
+    if (!reader.GetNamespaceName().empty()) {
+        path.SetNamespaceName(std::string(reader.GetNamespaceName()));
+    }
+    const std::string className(reader.GetClassName());
+    path.SetClass(ns && !className.empty() ? FindClass(*ns, className) : nullptr);
+    if (!path.fContents->fClass) {
+        path.SetClassName(className);
+    }
+    path.fContents->fBindings.reserve(reader.GetBindings().size());
+    for (TPathReader::TBinding& binding : reader.GetBindings()) {
+        path.fContents->fBindings.emplace_back(std::move(binding.fName), std::move(binding.fValue));
+    }
+    return path;
+}
+
+}  // namespace NORVZEL20

@@ -1,0 +1,359 @@
+#include "host/TCIMValue.h"
+
+#include <algorithm>
+#include <limits>
+
+#include "embedded/value/TCountedBlocks.h"
+#include "embedded/value/TValueAccess.h"
+#include "embedded/value/TValueText.h"
+#include "embedded/value/TValueXml.h"
+#include "host/TZELException.h"
+
+namespace NORVZEL20 {
+
+namespace {
+
+using TAccess = TValueAccess;
+using TType = TCIMValue::TCIMType;
+
+[[noreturn]] void RefuseType()
+{
+    throw TZELException(TZELStatusCode::kTypeMismatch);
+}
+
+bool IsUnsigned(TType::ECIMType type) noexcept
+{
+    return type == TType::kUint8 || type == TType::kUint16 || type == TType::kUint32 || type == TType::kUint64;
+}
+
+bool IsSigned(TType::ECIMType type) noexcept
+{
+    return type == TType::kSint8 || type == TType::kSint16 || type == TType::kSint32 || type == TType::kSint64;
+}
+
+bool IsReal(TType::ECIMType type) noexcept
+{
+    return type == TType::kReal32 || type == TType::kReal64;
+}
+
+double AsDouble(std::uint64_t bits) noexcept
+{
+    double number;
+    std::memcpy(&number, &bits, sizeof number);
+    return number;
+}
+
+void AppendElement(std::string& out, const TCIMValue& element)
+{
+    if (TAccess::IsText(element)) {
+        TValueText::AppendQuoted(out, TAccess::GetText(element), '"');
+    } else {
+        out += element.ToText();
+    }
+}
+
+void AppendElements(std::string& out, const std::vector<TCIMValue>& elements)
+{
+    out += '{';
+    for (std::size_t i = 0; i < elements.size(); ++i) {
+        out += i == 0 ? "" : ", ";
+        AppendElement(out, elements[i]);
+    }
+    out += '}';
+}
+
+}  // namespace
+
+TCIMValue::TCIMValue(TCIMType::ECIMType type, unsigned char form) noexcept : fType(type), fForm(form), fBytes() {}
+
+TCIMValue::TCIMValue() noexcept : TCIMValue(TCIMType::kNone, TAccess::kNull) {}
+
+TCIMValue TCIMValue::Null(TCIMType type) noexcept
+{
+    return TCIMValue(type, TAccess::kNull);
+}
+
+bool TCIMValue::IsShared() const noexcept
+{
+    return fForm >= TAccess::kSharedText;
+}
+
+TCIMValue::TCIMValue(const TCIMValue& other) noexcept : fType(other.fType), fForm(other.fForm)
+{
+    std::memcpy(fBytes, other.fBytes, sizeof fBytes);
+    if (IsShared()) {
+        if (const TCounted* const block = TAccess::GetBlock(*this)) {
+            block->Acquire();
+        }
+    }
+}
+
+TCIMValue::TCIMValue(TCIMValue&& other) noexcept : fType(other.fType), fForm(other.fForm)
+{
+    std::memcpy(fBytes, other.fBytes, sizeof fBytes);
+    other.fForm = TAccess::kNull;
+}
+
+TCIMValue& TCIMValue::operator=(const TCIMValue& other) noexcept
+{
+    return *this = TCIMValue(other);
+}
+
+TCIMValue& TCIMValue::operator=(TCIMValue&& other) noexcept
+{
+    if (this != &other) {
+        if (IsShared()) {
+            TAccess::DropBlock(*this);
+        }
+        fType = other.fType;
+        fForm = other.fForm;
+        std::memcpy(fBytes, other.fBytes, sizeof fBytes);
+        other.fForm = TAccess::kNull;
+    }
+    return *this;
+}
+
+TCIMValue::~TCIMValue()
+{
+    if (IsShared()) {
+        TAccess::DropBlock(*this);
+    }
+}
+
+TCIMValue::TCIMValue(bool value) noexcept : TCIMValue(TAccess::FromBits(TCIMType::kBoolean, value ? 1 : 0)) {}
+TCIMValue::TCIMValue(unsigned char value) noexcept : TCIMValue(TAccess::FromBits(TCIMType::kUint8, value)) {}
+TCIMValue::TCIMValue(signed char value) noexcept : TCIMValue(TAccess::FromBits(TCIMType::kSint8, std::uint64_t(value))) {}
+TCIMValue::TCIMValue(unsigned short value) noexcept : TCIMValue(TAccess::FromBits(TCIMType::kUint16, value)) {}
+TCIMValue::TCIMValue(short value) noexcept : TCIMValue(TAccess::FromBits(TCIMType::kSint16, std::uint64_t(value))) {}
+TCIMValue::TCIMValue(unsigned int value) noexcept : TCIMValue(TAccess::FromBits(TCIMType::kUint32, value)) {}
+TCIMValue::TCIMValue(int value) noexcept : TCIMValue(TAccess::FromBits(TCIMType::kSint32, std::uint64_t(value))) {}
+TCIMValue::TCIMValue(unsigned long value) noexcept : TCIMValue(TAccess::FromBits(TCIMType::kUint64, value)) {}
+TCIMValue::TCIMValue(long value) noexcept : TCIMValue(TAccess::FromBits(TCIMType::kSint64, std::uint64_t(value))) {}
+TCIMValue::TCIMValue(unsigned long long value) noexcept : TCIMValue(TAccess::FromBits(TCIMType::kUint64, value)) {}
+TCIMValue::TCIMValue(long long value) noexcept : TCIMValue(TAccess::FromBits(TCIMType::kSint64, std::uint64_t(value))) {}
+TCIMValue::TCIMValue(float value) noexcept : TCIMValue(TAccess::FromReal(TCIMType::kReal32, double(value))) {}
+TCIMValue::TCIMValue(double value) noexcept : TCIMValue(TAccess::FromReal(TCIMType::kReal64, value)) {}
+TCIMValue::TCIMValue(char16_t value) noexcept : TCIMValue(TAccess::FromBits(TCIMType::kChar16, value)) {}
+TCIMValue::TCIMValue(const std::string& text) : TCIMValue(FromText(text)) {}
+TCIMValue::TCIMValue(const char* text) : TCIMValue(FromText(text)) {}
+TCIMValue::TCIMValue(TCIMReference& path) : TCIMValue(static_cast<const TCIMReference&>(path)) {}
+
+TCIMValue::TCIMValue(const TCIMDateTime& value) noexcept : TCIMValue(TCIMType::kDateTime, TAccess::kDateTime)
+{
+    TAccess::StoreDateTime(*this, value);
+}
+
+TCIMValue::TCIMValue(const TCIMReference& path) : TCIMValue(TCIMType::kReference, TAccess::kPath)
+{
+    TAccess::Store(*this, TAccess::AcquirePath(path));
+}
+
+TCIMValue::TCIMValue(boost::shared_ptr<const TEmbeddedObject> object) : TCIMValue(TCIMType::kString, TAccess::kNull)
+{
+    if (object) {
+        TAccess::Store(*this, static_cast<const TCounted*>(new TCountedObject(std::move(object))));
+        fForm = TAccess::kObject;
+    }
+}
+
+TCIMValue::TCIMValue(TCIMType type, unsigned int count, const std::vector<TCIMValue>& elements)
+    : TCIMValue(type.GetArrayType(), TAccess::kNull)
+{
+    const TCIMType elementType = type.GetElementType();
+    if (elementType == TCIMType::kNone || elementType > TCIMType::kReference) {
+        RefuseType();
+    }
+    std::vector<TCIMValue> taken(elements.begin(),
+                                 elements.begin() + std::ptrdiff_t(std::min<std::size_t>(count, elements.size())));
+    for (TCIMValue& element : taken) {
+        if (element.IsNull()) {
+            element = Null(elementType);
+        } else if (element.fType != elementType) {
+            RefuseType();
+        }
+    }
+    TAccess::Store(*this, static_cast<const TCounted*>(new TCountedArray(std::move(taken))));
+    fForm = TAccess::kArray;
+}
+
+TCIMValue TCIMValue::FromText(std::string_view text)
+{
+    if (text.size() <= TAccess::kShortTextSize) {
+        TCIMValue value(TCIMType::kString, TAccess::kShortText);
+        TAccess::StoreText(value, text);
+        return value;
+    }
+    const TCounted* const block = TSharedText::CreateRaw(text);
+    TCIMValue value(TCIMType::kString, TAccess::kSharedText);
+    TAccess::Store(value, block);
+    return value;
+}
+
+TCIMValue::TCIMType TCIMValue::GetType() const noexcept
+{
+    return fType;
+}
+
+bool TCIMValue::IsNull() const noexcept
+{
+    return fForm == TAccess::kNull;
+}
+
+TCIMValue::operator unsigned short() const
+{
+    const bool isInteger = !IsNull() && (IsUnsigned(fType) || IsSigned(fType));
+    // A negative number, sign-extended, lies far beyond the range too.
+    if (!isInteger || TAccess::GetBits(*this) > std::numeric_limits<unsigned short>::max()) {
+        RefuseType();
+    }
+    return static_cast<unsigned short>(TAccess::GetBits(*this));
+}
+
+TCIMValue::operator TCIMReference() const
+{
+    if (fForm != TAccess::kPath) {
+        RefuseType();
+    }
+    return TAccess::GetPath(*this);
+}
+
+bool TCIMValue::GetBoolean() const
+{
+    if (IsNull() || fType != TCIMType::kBoolean) {
+        RefuseType();
+    }
+    return TAccess::GetBits(*this) != 0;
+}
+
+std::uint64_t TCIMValue::GetUnsigned() const
+{
+    if (IsNull() || !IsUnsigned(fType)) {
+        RefuseType();
+    }
+    return TAccess::GetBits(*this);
+}
+
+std::int64_t TCIMValue::GetSigned() const
+{
+    if (IsNull() || !IsSigned(fType)) {
+        RefuseType();
+    }
+    return std::int64_t(TAccess::GetBits(*this));
+}
+
+double TCIMValue::GetReal() const
+{
+    if (IsNull() || !IsReal(fType)) {
+        RefuseType();
+    }
+    return AsDouble(TAccess::GetBits(*this));
+}
+
+char16_t TCIMValue::GetChar16() const
+{
+    if (IsNull() || fType != TCIMType::kChar16) {
+        RefuseType();
+    }
+    return char16_t(TAccess::GetBits(*this));
+}
+
+std::string_view TCIMValue::GetString() const
+{
+    if (!TAccess::IsText(*this)) {
+        RefuseType();
+    }
+    return TAccess::GetText(*this);
+}
+
+TCIMDateTime TCIMValue::GetDateTime() const
+{
+    if (fForm != TAccess::kDateTime) {
+        RefuseType();
+    }
+    return TAccess::LoadDateTime(*this);
+}
+
+boost::shared_ptr<const TEmbeddedObject> TCIMValue::GetEmbeddedObject() const
+{
+    if (fType != TCIMType::kString) {
+        RefuseType();
+    }
+    return fForm == TAccess::kObject ? static_cast<const TCountedObject*>(TAccess::GetBlock(*this))->fObject : nullptr;
+}
+
+const std::vector<TCIMValue>& TCIMValue::GetElements() const
+{
+    if (fForm != TAccess::kArray && fForm != TAccess::kBag) {
+        RefuseType();
+    }
+    return static_cast<const TCountedArray*>(TAccess::GetBlock(*this))->fElements;
+}
+
+TCIMValue TCIMValue::AsBag() const
+{
+    TCIMValue result(*this);
+    if (fForm == TAccess::kArray) {
+        result.fForm = TAccess::kBag;
+    }
+    return result;
+}
+
+bool TCIMValue::IsBag() const noexcept
+{
+    return fForm == TAccess::kBag;
+}
+
+std::string TCIMValue::ToText() const
+{
+    std::string text;
+    switch (fForm) {
+    case TAccess::kNull:
+        text = "NULL";
+        break;
+    case TAccess::kObject:
+        text = GetEmbeddedObject()->ToText();
+        break;
+    case TAccess::kArray:
+    case TAccess::kBag:
+        AppendElements(text, GetElements());
+        break;
+    case TAccess::kPath:
+        text = TAccess::GetPath(*this).GetPath();
+        break;
+    default:
+        TValueText::AppendPlain(text, *this);
+        break;
+    }
+    return text;
+}
+
+void TCIMValue::AppendKeyText(std::string& out) const
+{
+    switch (fForm) {
+    case TAccess::kShortText:
+    case TAccess::kSharedText:
+        TValueText::AppendQuoted(out, TAccess::GetText(*this), '"');
+        break;
+    case TAccess::kNumber:
+        if (fType == TCIMType::kChar16) {
+            TValueText::AppendQuoted(out, ToText(), '\'');
+        } else if ((fType == TCIMType::kReal32 || fType == TCIMType::kReal64) && GetReal() == 0) {
+            out += '0';  // equal values have equal paths, and -0 equals 0
+        } else {
+            TValueText::AppendPlain(out, *this);
+        }
+        break;
+    case TAccess::kPath:
+        TValueText::AppendQuotedBy(out, '"', [this](std::string& text) { TAccess::GetPath(*this).AppendPath(text); });
+        break;
+    case TAccess::kDateTime:
+    case TAccess::kObject:
+        TValueText::AppendQuoted(out, ToText(), '"');
+        break;
+    default:
+        out += ToText();
+        break;
+    }
+}
+
+}  // namespace NORVZEL20

@@ -1,0 +1,151 @@
+#include <algorithm>
+#include <cmath>
+#include <functional>
+
+#include "embedded/value/TCountedBlocks.h"
+#include "embedded/value/TValueAccess.h"
+#include "host/TCIMValue.h"
+
+namespace NORVZEL20 {
+
+namespace {
+
+using TAccess = TValueAccess;
+
+bool IsReal(TCIMValue::TCIMType::ECIMType type) noexcept
+{
+    return type == TCIMValue::TCIMType::kReal32 || type == TCIMValue::TCIMType::kReal64;
+}
+
+double AsDouble(std::uint64_t bits) noexcept
+{
+    double number;
+    std::memcpy(&number, &bits, sizeof number);
+    return number;
+}
+
+bool EqualReals(std::uint64_t a, std::uint64_t b) noexcept
+{
+    const double x = AsDouble(a);
+    const double y = AsDouble(b);
+    return !(x < y) && !(x > y) && std::isnan(x) == std::isnan(y);
+}
+
+bool EqualInOrder(const std::vector<TCIMValue>& a, const std::vector<TCIMValue>& b)
+{
+    return a.size() == b.size() && std::equal(a.begin(), a.end(), b.begin());
+}
+
+using THashed = std::pair<std::size_t, const TCIMValue*>;
+
+std::vector<THashed> SortByHash(const std::vector<TCIMValue>& elements)
+{
+    std::vector<THashed> result;
+    result.reserve(elements.size());
+    for (const TCIMValue& element : elements) {
+        result.emplace_back(element.Hash(), &element);
+    }
+    std::sort(result.begin(), result.end());
+    return result;
+}
+
+// Pairs off the elements of two runs of one hash; nearly always they are equal throughout, so that the first candidate is the right
+// one.
+bool PairOff(std::vector<THashed>::const_iterator first, std::vector<THashed>::const_iterator last,
+             std::vector<THashed>::iterator candidates)
+{
+    for (const auto runEnd = candidates + (last - first); first != last; ++first, ++candidates) {
+        const auto match = std::find_if(candidates, runEnd, [&first](const THashed& c) { return *first->second == *c.second; });
+        if (match == runEnd) {
+            return false;
+        }
+        std::iter_swap(candidates, match);
+    }
+    return true;
+}
+
+bool EqualAsBags(const std::vector<TCIMValue>& a, const std::vector<TCIMValue>& b)
+{
+    if (a.size() != b.size()) {
+        return false;
+    }
+    const std::vector<THashed> left = SortByHash(a);
+    std::vector<THashed> right = SortByHash(b);
+    const auto sameHash = [](const THashed& x, const THashed& y) { return x.first == y.first; };
+    if (!std::equal(left.begin(), left.end(), right.begin(), sameHash)) {
+        return false;
+    }
+    for (auto run = left.begin(); run != left.end();) {
+        const auto end = std::find_if(run, left.end(), [run](const THashed& x) { return x.first != run->first; });
+        if (!PairOff(run, end, right.begin() + (run - left.begin()))) {
+            return false;
+        }
+        run = end;
+    }
+    return true;
+}
+
+std::size_t Mix(std::size_t hash, std::size_t more) noexcept
+{
+    return (hash ^ more) * 0x9E3779B97F4A7C15u + (more >> 29);
+}
+
+}  // namespace
+
+bool TCIMValue::operator==(const TCIMValue& other) const
+{
+    if (IsNull() || other.IsNull()) {
+        return IsNull() && other.IsNull();
+    }
+    if (fType != other.fType) {
+        return false;
+    }
+    if (fForm == other.fForm && std::memcmp(fBytes, other.fBytes, sizeof fBytes) == 0) {
+        return true;
+    }
+    switch (fForm) {
+    case TAccess::kNumber:
+        return IsReal(fType) && EqualReals(TAccess::GetBits(*this), TAccess::GetBits(other));
+    case TAccess::kDateTime:
+        return TAccess::LoadDateTime(*this) == TAccess::LoadDateTime(other);
+    case TAccess::kObject:
+        return other.fForm == TAccess::kObject && *GetEmbeddedObject() == *other.GetEmbeddedObject();
+    case TAccess::kArray:
+        return EqualInOrder(GetElements(), other.GetElements());
+    case TAccess::kBag:
+        return EqualAsBags(GetElements(), other.GetElements());
+    case TAccess::kPath:
+        return TAccess::GetPath(*this).GetPath() == TAccess::GetPath(other).GetPath();
+    default:
+        return TAccess::IsText(other) && TAccess::GetText(*this) == TAccess::GetText(other);
+    }
+}
+
+std::size_t TCIMValue::Hash() const
+{
+    switch (fForm) {
+    case TAccess::kNull:
+        return 0;
+    case TAccess::kNumber:
+        return IsReal(fType) ? std::hash<double>()(std::isnan(GetReal()) ? 1e-300 : GetReal())
+                             : Mix(fType, std::size_t(TAccess::GetBits(*this)));
+    case TAccess::kDateTime:
+        return Mix(std::size_t(TAccess::LoadDateTime(*this).GetMicroseconds()), TAccess::LoadDateTime(*this).GetUnknown());
+    case TAccess::kObject:
+        return GetEmbeddedObject()->Hash();
+    case TAccess::kArray:
+    case TAccess::kBag: {
+        std::size_t hash = GetElements().size();
+        for (const TCIMValue& element : GetElements()) {
+            hash = Mix(hash, element.Hash());
+        }
+        return hash;
+    }
+    case TAccess::kPath:
+        return std::hash<std::string>()(TAccess::GetPath(*this).GetPath());
+    default:
+        return std::hash<std::string_view>()(TAccess::GetText(*this));
+    }
+}
+
+}  // namespace NORVZEL20

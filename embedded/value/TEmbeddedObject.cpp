@@ -1,0 +1,145 @@
+#include "embedded/value/TEmbeddedObject.h"
+
+#include <algorithm>
+
+#include "embedded/value/TNameText.h"
+#include "embedded/value/TValueXml.h"
+
+namespace NORVZEL20 {
+
+namespace {
+
+// Parts of objects, each by its name and contents.
+bool Equal(const TEmbeddedObject::TQualifier& a, const TEmbeddedObject::TQualifier& b);
+bool Equal(const TEmbeddedObject::TProperty& a, const TEmbeddedObject::TProperty& b);
+bool Equal(const TEmbeddedObject::TMethod& a, const TEmbeddedObject::TMethod& b);
+
+template <class T>
+std::vector<const T*> SortByName(const std::vector<T>& elements)
+{
+    std::vector<const T*> sorted;
+    sorted.reserve(elements.size());
+    for (const T& element : elements) {
+        sorted.push_back(&element);
+    }
+    std::stable_sort(sorted.begin(), sorted.end(),
+                     [](const T* a, const T* b) { return TNameText::Compare(a->fName, b->fName) < 0; });
+    return sorted;
+}
+
+template <class T>
+bool EqualSorted(const std::vector<const T*>& a, const std::vector<const T*>& b)
+{
+    return std::equal(a.begin(), a.end(), b.begin(), b.end(), [](const T* x, const T* y) { return Equal(*x, *y); });
+}
+
+bool Equal(const TEmbeddedObject::TQualifier& a, const TEmbeddedObject::TQualifier& b)
+{
+    return TNameText::Equal(a.fName, b.fName) && a.fFlavor == b.fFlavor && a.fValue.GetType() == b.fValue.GetType() &&
+           a.fValue == b.fValue;
+}
+
+bool Equal(const TEmbeddedObject::TProperty& a, const TEmbeddedObject::TProperty& b)
+{
+    return TNameText::Equal(a.fName, b.fName) && a.fArraySize == b.fArraySize && a.fValue.GetType() == b.fValue.GetType() &&
+           TNameText::Equal(a.fReferenceClass, b.fReferenceClass) && a.fValue == b.fValue &&
+           EqualSorted(SortByName(a.fQualifiers), SortByName(b.fQualifiers));
+}
+
+bool Equal(const TEmbeddedObject::TParameter& a, const TEmbeddedObject::TParameter& b)
+{
+    return TNameText::Equal(a.fName, b.fName) && a.fArraySize == b.fArraySize && a.fType == b.fType &&
+           TNameText::Equal(a.fReferenceClass, b.fReferenceClass) &&
+           EqualSorted(SortByName(a.fQualifiers), SortByName(b.fQualifiers));
+}
+
+bool Equal(const TEmbeddedObject::TMethod& a, const TEmbeddedObject::TMethod& b)
+{
+    return TNameText::Equal(a.fName, b.fName) && a.fType == b.fType &&
+           std::equal(a.fParameters.begin(), a.fParameters.end(), b.fParameters.begin(), b.fParameters.end(),
+                      [](const auto& x, const auto& y) { return Equal(x, y); }) &&
+           EqualSorted(SortByName(a.fQualifiers), SortByName(b.fQualifiers));
+}
+
+/// An array may be a bag here and none in the object it is compared with: whatever is equal then must agree.
+std::size_t HashWithoutOrder(const TCIMValue& value)
+{
+    if (value.IsNull() || !value.GetType().IsArray()) {
+        return value.Hash();
+    }
+    std::size_t hash = value.GetElements().size();
+    for (const TCIMValue& element : value.GetElements()) {
+        hash += (element.Hash() ^ 0x9E3779B9u) * 0x9E3779B97F4A7C15u;
+    }
+    return hash;
+}
+
+std::vector<const TEmbeddedObject::TProperty*> GetComparedProperties(const TEmbeddedObject& object)
+{
+    auto properties = SortByName(object.GetProperties());
+    if (!object.IsClass()) {
+        const auto isNull = [](const TEmbeddedObject::TProperty* property) { return property->fValue.IsNull(); };
+        properties.erase(std::remove_if(properties.begin(), properties.end(), isNull), properties.end());
+    }
+    return properties;
+}
+
+}  // namespace
+
+TEmbeddedObject::TEmbeddedObject(std::string className, bool isClass) : fClassName(std::move(className)), fIsClass(isClass) {}
+
+const TEmbeddedObject::TProperty* TEmbeddedObject::FindProperty(std::string_view name) const noexcept
+{
+    const auto found = std::find_if(fProperties.begin(), fProperties.end(),
+                                    [name](const TProperty& property) { return TNameText::Equal(property.fName, name); });
+    return found != fProperties.end() ? &*found : nullptr;
+}
+
+void TEmbeddedObject::SetSuperClassName(std::string name)
+{
+    fSuperClassName = std::move(name);
+}
+
+void TEmbeddedObject::AddQualifier(TQualifier qualifier)
+{
+    fQualifiers.push_back(std::move(qualifier));
+}
+
+void TEmbeddedObject::AddProperty(TProperty property)
+{
+    fProperties.push_back(std::move(property));
+}
+
+void TEmbeddedObject::AddMethod(TMethod method)
+{
+    fMethods.push_back(std::move(method));
+}
+
+bool TEmbeddedObject::operator==(const TEmbeddedObject& other) const
+{
+    return fIsClass == other.fIsClass && TNameText::Equal(fClassName, other.fClassName) &&
+           TNameText::Equal(fSuperClassName, other.fSuperClassName) &&
+           EqualSorted(GetComparedProperties(*this), GetComparedProperties(other)) &&
+           EqualSorted(SortByName(fQualifiers), SortByName(other.fQualifiers)) &&
+           EqualSorted(SortByName(fMethods), SortByName(other.fMethods));
+}
+
+std::size_t TEmbeddedObject::Hash() const
+{
+    std::size_t hash = TNameText::Hash(fClassName) + (fIsClass ? 1u : 0u);
+    for (const TProperty& property : fProperties) {
+        // A sum, so that the order does not matter.
+        hash += property.fValue.IsNull() ? 0 : TNameText::Hash(property.fName);
+        hash += HashWithoutOrder(property.fValue) * 31;
+    }
+    return hash;
+}
+
+std::string TEmbeddedObject::ToText() const
+{
+    std::string text;
+    TValueXml::AppendObject(text, *this);
+    return text;
+}
+
+}  // namespace NORVZEL20

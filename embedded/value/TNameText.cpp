@@ -1,0 +1,48 @@
+#include "embedded/value/TNameText.h"
+
+#include <algorithm>
+#include <cstring>
+
+namespace NORVZEL20 {
+
+std::string TNameText::ToLower(std::string_view name)
+{
+    std::string result(name);
+    std::transform(result.begin(), result.end(), result.begin(), [](char c) { return ToLower(c); });
+    return result;
+}
+
+bool TNameText::Equal(std::string_view a, std::string_view b) noexcept
+{
+    if (a.size() != b.size()) {
+        return false;
+    }
+    // Names nearly always come in the spelling that they were declared in.
+    if (std::memcmp(a.data(), b.data(), a.size()) == 0) {
+        return true;
+    }
+    return std::equal(a.begin(), a.end(), b.begin(), [](char x, char y) { return ToLower(x) == ToLower(y); });
+}
+
+int TNameText::Compare(std::string_view a, std::string_view b) noexcept
+{
+    const std::size_t common = std::min(a.size(), b.size());
+    for (std::size_t i = 0; i < common; ++i) {
+        const int difference = int(static_cast<unsigned char>(ToLower(a[i]))) - int(static_cast<unsigned char>(ToLower(b[i])));
+        if (difference != 0) {
+            return difference;
+        }
+    }
+    return a.size() == b.size() ? 0 : (a.size() < b.size() ? -1 : 1);
+}
+
+std::uint32_t TNameText::Hash(std::string_view name) noexcept
+{
+    std::uint64_t hash = 0xcbf29ce484222325u;  // FNV-1a, folded: names are short
+    for (const char c : name) {
+        hash = (hash ^ static_cast<unsigned char>(ToLower(c))) * 0x100000001b3u;
+    }
+    return std::uint32_t(hash ^ (hash >> 32));
+}
+
+}  // namespace NORVZEL20

@@ -1,0 +1,51 @@
+#pragma once
+
+#include <boost/smart_ptr/weak_ptr.hpp>
+#include <memory>
+#include <string>
+#include <utility>
+#include <vector>
+
+#include "embedded/value/TCounted.h"
+#include "host/ICIMNamespace.h"
+#include "host/TCIMReference.h"
+
+namespace NORVZEL20 {
+
+/// What a path holds. Most paths that an inventory stores name no namespace, so that part costs one pointer.
+struct TCIMReference::TContents : TCounted {
+    using TBinding = std::pair<std::string, TCIMValue>;
+
+    struct TPlace {
+        boost::weak_ptr<ICIMNamespace> fNamespace;
+        std::string fNamespaceName;
+        std::string fHost;
+    };
+
+    // Each level doubles the escapes of the one within, so that the text of a deep path would fill any memory.
+    static constexpr unsigned int kMaxDepth = 12;
+
+    TContents() = default;
+    TContents(const TContents& other)
+        : TCounted(), fPlace(other.fPlace ? std::make_unique<TPlace>(*other.fPlace) : nullptr), fClass(other.fClass),
+          fBindings(other.fBindings), fDepth(other.fDepth)
+    {}
+
+    TPlace& OwnPlace()
+    {
+        if (!fPlace) {
+            fPlace = std::make_unique<TPlace>();
+        }
+        return *fPlace;
+    }
+
+    /// How deep references stand in `value`; 0 where there is none.
+    static unsigned int GetDepth(const TCIMValue& value);
+
+    std::unique_ptr<TPlace> fPlace;  // null: no namespace and no host
+    boost::shared_ptr<ICIMClass> fClass;
+    std::vector<TBinding> fBindings;  // in the order of the names in lower case
+    unsigned int fDepth = 0;          // how deep references stand in the bindings of references
+};
+
+}  // namespace NORVZEL20

@@ -1,0 +1,107 @@
+#include "embedded/value/TValueAccess.h"
+
+#include <new>
+
+#include "embedded/value/TCountedBlocks.h"
+#include "embedded/value/TReferenceContents.h"
+
+namespace NORVZEL20 {
+
+static_assert(sizeof(TCIMValue) == 16, "values are laid out inline in instances by the million");
+static_assert(sizeof(TCIMReference) == sizeof(void*), "a path value holds the path itself in the place of its pointer");
+
+TCIMValue TValueAccess::FromSharedText(const TSharedText::TPointer& text) noexcept
+{
+    if (text->GetText().size() <= kShortTextSize) {
+        TCIMValue value(TCIMValue::TCIMType::kString, kShortText);
+        StoreText(value, text->GetText());
+        return value;
+    }
+    TCIMValue value(TCIMValue::TCIMType::kString, kSharedText);
+    text->Acquire();
+    Store(value, static_cast<const TCounted*>(text.get()));
+    return value;
+}
+
+std::string_view TValueAccess::GetText(const TCIMValue& value) noexcept
+{
+    if (value.fForm == kShortText) {
+        return {reinterpret_cast<const char*>(value.fBytes + 1), value.fBytes[0]};
+    }
+    return static_cast<const TSharedText*>(GetBlock(value))->GetText();
+}
+
+TCIMValue TValueAccess::FromBits(TCIMValue::TCIMType type, std::uint64_t bits) noexcept
+{
+    TCIMValue value(type, kNumber);
+    Store(value, bits);
+    return value;
+}
+
+TCIMValue TValueAccess::FromReal(TCIMValue::TCIMType type, double number) noexcept
+{
+    TCIMValue value(type, kNumber);
+    Store(value, number);
+    return value;
+}
+
+const TCIMReference& TValueAccess::GetPath(const TCIMValue& value) noexcept
+{
+    return *std::launder(reinterpret_cast<const TCIMReference*>(value.fBytes + kPayload));
+}
+
+void TValueAccess::StoreText(TCIMValue& value, std::string_view text) noexcept
+{
+    value.fBytes[0] = static_cast<unsigned char>(text.size());
+    if (!text.empty()) {
+        std::memcpy(value.fBytes + 1, text.data(), text.size());
+    }
+}
+
+void TValueAccess::StoreDateTime(TCIMValue& value, const TCIMDateTime& time) noexcept
+{
+    Store(value, time.fMicroseconds);
+    Store(value, time.fOffset, 0);
+    Store(value, time.fUnknown, 2);
+    Store(value, static_cast<unsigned char>(time.fInterval), 4);
+}
+
+TCIMDateTime TValueAccess::LoadDateTime(const TCIMValue& value) noexcept
+{
+    TCIMDateTime time;
+    time.fMicroseconds = Load<std::int64_t>(value);
+    time.fOffset = Load<std::int16_t>(value, 0);
+    time.fUnknown = Load<std::uint16_t>(value, 2);
+    time.fInterval = Load<unsigned char>(value, 4) != 0;
+    return time;
+}
+
+const TCounted* TValueAccess::AcquirePath(const TCIMReference& path) noexcept
+{
+    if (path.fContents != nullptr) {
+        path.fContents->Acquire();
+    }
+    return path.fContents;
+}
+
+void TValueAccess::DropBlock(const TCIMValue& value) noexcept
+{
+    const TCounted* const block = GetBlock(value);
+    if (value.fForm == kSharedText) {
+        TSharedText::Drop(static_cast<const TSharedText*>(block));
+    } else if (block != nullptr && block->Release()) {
+        switch (value.fForm) {
+        case kObject:
+            delete static_cast<const TCountedObject*>(block);
+            break;
+        case kPath:
+            delete static_cast<const TCIMReference::TContents*>(block);
+            break;
+        default:
+            delete static_cast<const TCountedArray*>(block);
+            break;
+        }
+    }
+}
+
+}  // namespace NORVZEL20

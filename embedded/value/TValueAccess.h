@@ -1,0 +1,76 @@
+#pragma once
+
+#include <cstring>
+
+#include "embedded/value/TSharedText.h"
+#include "host/TCIMDateTime.h"
+#include "host/TCIMReference.h"
+#include "host/TCIMValue.h"
+
+namespace NORVZEL20 {
+
+/// The way behind the curtain of the value types, for this library alone: what a value holds, without checks, and making values
+/// without copying.
+class TValueAccess {
+  public:
+    /// How a value holds its contents. Everything from kSharedText on is a pointer to a block that begins with TCounted.
+    enum EForm : unsigned char {
+        kNull = 0,
+        kNumber,      ///< boolean, integer, real or char16: 64 bits
+        kDateTime,    ///< the parts of a TCIMDateTime
+        kShortText,   ///< length and up to kShortTextSize bytes
+        kSharedText,  ///< TSharedText
+        kObject,      ///< TCountedObject
+        kArray,       ///< TCountedArray
+        kBag,         ///< TCountedArray, compared as a multiset
+        kPath         ///< TCIMReference's contents, a null pointer for the empty path
+    };
+    static constexpr std::size_t kShortTextSize = 13;
+
+    static EForm GetForm(const TCIMValue& value) noexcept { return EForm(value.fForm); }
+
+    /// A string that shares `text`; short text is copied into the value instead. `text` must not be null.
+    static TCIMValue FromSharedText(const TSharedText::TPointer& text) noexcept;
+
+    /// The text of a value in one of the two text forms.
+    static std::string_view GetText(const TCIMValue& value) noexcept;
+    static bool IsText(const TCIMValue& value) noexcept { return value.fForm == kShortText || value.fForm == kSharedText; }
+
+    /// The number of a value of form kNumber: signed integers sign-extended, reals as the bits of a double, char16 as its unit.
+    static std::uint64_t GetBits(const TCIMValue& value) noexcept { return Load<std::uint64_t>(value); }
+    /// A value of the non-array type `type`, which must be one that form kNumber serves; `bits` as in GetBits, in range.
+    static TCIMValue FromBits(TCIMValue::TCIMType type, std::uint64_t bits) noexcept;
+    static TCIMValue FromReal(TCIMValue::TCIMType type, double number) noexcept;
+
+    /// The path of a value of form kPath, without a copy of it: valid while the value lives unchanged.
+    static const TCIMReference& GetPath(const TCIMValue& value) noexcept;
+
+  private:
+    friend class TCIMValue;
+
+    // A number or pointer stands at offset 8 of the value, which is aligned to 8.
+    static constexpr std::size_t kPayload = 6;
+
+    template <class T>
+    static T Load(const TCIMValue& value, std::size_t offset = kPayload) noexcept
+    {
+        T result;
+        std::memcpy(&result, value.fBytes + offset, sizeof result);
+        return result;
+    }
+
+    template <class T>
+    static void Store(TCIMValue& value, const T& part, std::size_t offset = kPayload) noexcept
+    {
+        std::memcpy(value.fBytes + offset, &part, sizeof part);
+    }
+
+    static const TCounted* GetBlock(const TCIMValue& value) noexcept { return Load<const TCounted*>(value); }
+    static void StoreText(TCIMValue& value, std::string_view text) noexcept;
+    static void StoreDateTime(TCIMValue& value, const TCIMDateTime& time) noexcept;
+    static TCIMDateTime LoadDateTime(const TCIMValue& value) noexcept;
+    static const TCounted* AcquirePath(const TCIMReference& path) noexcept;
+    static void DropBlock(const TCIMValue& value) noexcept;
+};
+
+}  // namespace NORVZEL20

@@ -1,0 +1,294 @@
+#include "embedded/value/TValueText.h"
+
+#include <charconv>
+#include <cmath>
+#include <limits>
+#include <system_error>
+
+#include "embedded/value/TInteger.h"
+#include "embedded/value/TNameText.h"
+#include "embedded/value/TValueAccess.h"
+#include "host/TCIMDateTime.h"
+
+namespace NORVZEL20 {
+
+namespace {
+
+using TType = TCIMValue::TCIMType;
+
+constexpr const char* kTypeNames[] = {"",       "boolean", "uint8",  "sint8",  "uint16", "sint16", "uint32",   "sint32",
+                                      "uint64", "sint64",  "real32", "real64", "char16", "string", "datetime", "reference"};
+
+std::string_view Trim(std::string_view text) noexcept
+{
+    constexpr std::string_view kBlanks = " \t\r\n";
+    const std::size_t first = text.find_first_not_of(kBlanks);
+    return first == std::string_view::npos ? std::string_view() : text.substr(first, text.find_last_not_of(kBlanks) + 1 - first);
+}
+
+template <class T>
+bool ReadAll(std::string_view digits, T& number, int base)
+{
+    const char* const end = digits.data() + digits.size();
+    const auto read = std::from_chars(digits.data(), end, number, base);
+    return read.ec == std::errc() && read.ptr == end;
+}
+
+bool ParseBoolean(std::string_view text, TCIMValue& result)
+{
+    const bool isTrue = TNameText::Equal(text, "TRUE");
+    if (!isTrue && !TNameText::Equal(text, "FALSE")) {
+        return false;
+    }
+    result = TCIMValue(isTrue);
+    return true;
+}
+
+bool ParseInteger(TType::ECIMType type, std::string_view text, TCIMValue& result)
+{
+    TInteger number{0, !text.empty() && text[0] == '-'};
+    if (number.fIsNegative && !TInteger::IsOfSigned(type)) {
+        return false;
+    }
+    if (number.fIsNegative || (!text.empty() && text[0] == '+')) {
+        text.remove_prefix(1);
+    }
+    const bool isHexadecimal = text.size() > 2 && text[0] == '0' && TNameText::ToLower(text[1]) == 'x';
+    const bool isRead = isHexadecimal ? ReadAll(text.substr(2), number.fMagnitude, 16) : ReadAll(text, number.fMagnitude, 10);
+    return isRead && number.Make(type, result);
+}
+
+bool ReadNamedReal(std::string_view text, double& number)
+{
+    if (TNameText::Equal(text, "NaN")) {
+        number = std::numeric_limits<double>::quiet_NaN();
+        return true;
+    }
+    const bool isNegative = !text.empty() && text[0] == '-';
+    if (isNegative || (!text.empty() && text[0] == '+')) {
+        text.remove_prefix(1);
+    }
+    number = isNegative ? -std::numeric_limits<double>::infinity() : std::numeric_limits<double>::infinity();
+    return TNameText::Equal(text, "INF");
+}
+
+// Whether a number that is out of range is too small for the type rather than too large; it then becomes 0, or the least number.
+template <class T>
+bool RoundsToZero(std::string_view text, T& number)
+{
+    long double wide = 0;
+    const auto read = std::from_chars(text.data(), text.data() + text.size(), wide);
+    if (read.ec != std::errc() || wide <= -1 || wide >= 1) {
+        return false;
+    }
+    number = static_cast<T>(wide);
+    return true;
+}
+
+template <class T>
+bool ReadReal(std::string_view text, T& number)
+{
+    const bool hasSign = !text.empty() && (text[0] == '+' || text[0] == '-');
+    const char first = text.size() > (hasSign ? 1u : 0u) ? text[hasSign ? 1 : 0] : '\0';
+    // The library's own words for infinity and not-a-number are more than CIM has, and its numbers have no plus sign.
+    if (first != '.' && (first < '0' || first > '9')) {
+        return false;
+    }
+    text.remove_prefix(text[0] == '+' ? 1 : 0);
+    const char* const end = text.data() + text.size();
+    const auto read = std::from_chars(text.data(), end, number);
+    if (read.ptr != end) {
+        return false;
+    }
+    return read.ec == std::errc() || RoundsToZero(text, number);
+}
+
+bool ParseReal(TType::ECIMType type, std::string_view text, TCIMValue& result)
+{
+    double number = 0;
+    float narrow = 0;
+    if (!ReadNamedReal(text, number)) {
+        if (type == TType::kReal64 ? !ReadReal(text, number) : !ReadReal(text, narrow)) {
+            return false;
+        }
+        number = type == TType::kReal64 ? number : double(narrow);
+    }
+    result = TValueAccess::FromReal(type, number);
+    return true;
+}
+
+bool IsContinuation(char c) noexcept
+{
+    return (static_cast<unsigned char>(c) & 0xC0u) == 0x80u;
+}
+
+bool ParseChar16(std::string_view text, TCIMValue& result)
+{
+    const auto byte = [text](std::size_t i) { return static_cast<unsigned char>(text[i]); };
+    unsigned int unit = 0;
+    unsigned int least = 0;
+    if (text.size() == 1 && byte(0) < 0x80u) {
+        unit = byte(0);
+    } else if (text.size() == 2 && (byte(0) & 0xE0u) == 0xC0u && IsContinuation(text[1])) {
+        unit = (byte(0) & 0x1Fu) << 6 | (byte(1) & 0x3Fu);
+        least = 0x80;
+    } else if (text.size() == 3 && (byte(0) & 0xF0u) == 0xE0u && IsContinuation(text[1]) && IsContinuation(text[2])) {
+        unit = (byte(0) & 0x0Fu) << 12 | (byte(1) & 0x3Fu) << 6 | (byte(2) & 0x3Fu);
+        least = 0x800;
+    } else {
+        return false;
+    }
+    if (unit < least) {
+        return false;
+    }
+    result = TCIMValue(char16_t(unit));
+    return true;
+}
+
+bool ParseDateTime(std::string_view text, TCIMValue& result)
+{
+    TCIMDateTime time;
+    if (!TCIMDateTime::Parse(text, time)) {
+        return false;
+    }
+    result = TCIMValue(time);
+    return true;
+}
+
+}  // namespace
+
+bool TValueText::Parse(TCIMValue::TCIMType type, std::string_view text, TCIMValue& result)
+{
+    switch (TType::ECIMType(type)) {
+    case TType::kString:
+        result = TCIMValue::FromText(text);
+        return true;
+    case TType::kChar16:
+        return ParseChar16(text, result);
+    case TType::kBoolean:
+        return ParseBoolean(Trim(text), result);
+    case TType::kDateTime:
+        return ParseDateTime(Trim(text), result);
+    case TType::kReal32:
+    case TType::kReal64:
+        return ParseReal(type, Trim(text), result);
+    default:
+        return TInteger::IsOfInteger(type) && ParseInteger(type, Trim(text), result);
+    }
+}
+
+const char* TValueText::GetTypeName(TCIMValue::TCIMType type) noexcept
+{
+    const TType::ECIMType element = type.GetElementType();
+    return element <= TType::kReference ? kTypeNames[element] : "";
+}
+
+TCIMValue::TCIMType TValueText::FindType(std::string_view name) noexcept
+{
+    for (unsigned char code = TType::kBoolean; code <= TType::kReference; ++code) {
+        if (name == kTypeNames[code]) {
+            return TType::ECIMType(code);
+        }
+    }
+    return TType::kNone;
+}
+
+void TValueText::AppendPlain(std::string& out, const TCIMValue& value)
+{
+    const TType::ECIMType type = value.GetType();
+    switch (type) {
+    case TType::kBoolean:
+        out += value.GetBoolean() ? "TRUE" : "FALSE";
+        break;
+    case TType::kChar16:
+        AppendChar16(out, value.GetChar16());
+        break;
+    case TType::kString:
+        out += value.GetString();
+        break;
+    case TType::kDateTime:
+        out += value.GetDateTime().ToText();
+        break;
+    case TType::kReal32:
+    case TType::kReal64:
+        AppendReal(out, value.GetReal(), type == TType::kReal32);
+        break;
+    default:
+        if (TInteger::IsOfSigned(type)) {
+            AppendSigned(out, value.GetSigned());
+        } else {
+            AppendUnsigned(out, value.GetUnsigned());
+        }
+        break;
+    }
+}
+
+void TValueText::AppendQuoted(std::string& out, std::string_view text, char quote)
+{
+    AppendQuotedBy(out, quote, [text](std::string& to) { to += text; });
+}
+
+// Counts first, then moves the characters to their places from the end on: linear, and nothing at all for ordinary text.
+void TValueText::EscapeFrom(std::string& out, std::size_t start, char quote)
+{
+    std::size_t escapes = 0;
+    for (std::size_t i = start; i < out.size(); ++i) {
+        escapes += out[i] == quote || out[i] == '\\' ? 1 : 0;
+    }
+    if (escapes == 0) {
+        return;
+    }
+    std::size_t from = out.size();
+    out.resize(out.size() + escapes);
+    for (std::size_t to = out.size(); from != to;) {
+        const char c = out[--from];
+        out[--to] = c;
+        if (c == quote || c == '\\') {
+            out[--to] = '\\';
+        }
+    }
+}
+
+void TValueText::AppendUnsigned(std::string& out, std::uint64_t number)
+{
+    char digits[20];
+    out.append(digits, std::to_chars(digits, digits + sizeof digits, number).ptr);
+}
+
+void TValueText::AppendSigned(std::string& out, std::int64_t number)
+{
+    char digits[20];
+    out.append(digits, std::to_chars(digits, digits + sizeof digits, number).ptr);
+}
+
+void TValueText::AppendReal(std::string& out, double number, bool isReal32)
+{
+    if (std::isnan(number)) {
+        out += "NaN";
+        return;
+    }
+    if (std::isinf(number)) {
+        out += number < 0 ? "-INF" : "INF";
+        return;
+    }
+    char digits[32];
+    char* const end = digits + sizeof digits;
+    out.append(digits, isReal32 ? std::to_chars(digits, end, float(number)).ptr : std::to_chars(digits, end, number).ptr);
+}
+
+void TValueText::AppendChar16(std::string& out, char16_t unit)
+{
+    const unsigned int code = unit;
+    if (code < 0x80) {
+        out += char(code);
+    } else if (code < 0x800) {
+        out += char(0xC0u | code >> 6);
+        out += char(0x80u | (code & 0x3Fu));
+    } else {
+        out += char(0xE0u | code >> 12);
+        out += char(0x80u | (code >> 6 & 0x3Fu));
+        out += char(0x80u | (code & 0x3Fu));
+    }
+}
+
+}  // namespace NORVZEL20

@@ -1,0 +1,104 @@
+#include <cmath>
+#include <limits>
+
+#include "embedded/value/TInteger.h"
+#include "embedded/value/TValueAccess.h"
+#include "embedded/value/TValueText.h"
+#include "host/TZELException.h"
+
+namespace NORVZEL20 {
+
+namespace {
+
+using TType = TCIMValue::TCIMType;
+
+bool IsReal(TType::ECIMType type) noexcept
+{
+    return type == TType::kReal32 || type == TType::kReal64;
+}
+
+bool ConvertToReal(const TCIMValue& value, TType::ECIMType type, TCIMValue& result)
+{
+    double number = 0;
+    if (IsReal(value.GetType())) {
+        number = value.GetReal();
+    } else {
+        const TInteger integer = TInteger::Read(value);
+        number = double(integer.fMagnitude);
+        // 2^64 itself would not convert back.
+        if (number >= 0x1p64 || std::uint64_t(number) != integer.fMagnitude) {
+            return false;
+        }
+        number = integer.fIsNegative ? -number : number;
+    }
+    if (type == TType::kReal32 && !std::isnan(number) && !std::isinf(number) &&
+        (std::fabs(number) > double(std::numeric_limits<float>::max()) || double(float(number)) != number)) {
+        return false;
+    }
+    result = TValueAccess::FromReal(type, number);
+    return true;
+}
+
+bool ConvertToPath(std::string_view text, TCIMValue& result)
+{
+    try {
+        result = TCIMValue(TCIMReference::Parse(std::string(text)));
+        return true;
+    } catch (const TZELException&) {
+        return false;
+    }
+}
+
+bool ConvertArray(const TCIMValue& value, TType type, TCIMValue& result)
+{
+    std::vector<TCIMValue> elements;
+    elements.reserve(value.GetElements().size());
+    for (const TCIMValue& element : value.GetElements()) {
+        elements.emplace_back();
+        if (!TValueText::Convert(element, type.GetElementType(), elements.back())) {
+            return false;
+        }
+    }
+    TCIMValue array(type, unsigned(elements.size()), elements);
+    result = value.IsBag() ? array.AsBag() : array;
+    return true;
+}
+
+bool ConvertNumber(const TCIMValue& value, TType::ECIMType type, TCIMValue& result)
+{
+    const bool isInteger = TInteger::IsOfInteger(value.GetType());
+    if (isInteger && TInteger::IsOfInteger(type)) {
+        return TInteger::Read(value).Make(type, result);
+    }
+    return (isInteger || IsReal(value.GetType())) && IsReal(type) && ConvertToReal(value, type, result);
+}
+
+}  // namespace
+
+bool TValueText::Convert(const TCIMValue& value, TCIMValue::TCIMType type, TCIMValue& result)
+{
+    if (value.IsNull()) {
+        result = TCIMValue::Null(type);
+        return true;
+    }
+    const TType from = value.GetType();
+    if (TType::ECIMType(from) == type) {
+        result = value;
+        return true;
+    }
+    if (from.IsArray() || type.IsArray()) {
+        return from.IsArray() && type.IsArray() && ConvertArray(value, type, result);
+    }
+    if (TValueAccess::IsText(value)) {
+        const std::string_view text = TValueAccess::GetText(value);
+        return TType::ECIMType(type) == TType::kReference ? ConvertToPath(text, result) : Parse(type, text, result);
+    }
+    if (TType::ECIMType(type) == TType::kString) {
+        const bool hasText = TType::ECIMType(from) == TType::kChar16 || TType::ECIMType(from) == TType::kDateTime ||
+                             TType::ECIMType(from) == TType::kReference;
+        return hasText && Parse(type, value.ToText(), result);
+    }
+    return ConvertNumber(value, type, result);
+}
+
+}  // namespace NORVZEL20

@@ -1,0 +1,115 @@
+#include <sys/stat.h>
+
+#include <cerrno>
+#include <cstring>
+
+#include "client/process/TClientError.h"
+#include "client/process/TStandardConsole.h"
+#include "tests/client/ClientTest.h"
+#include "tests/client/TOutputFolder.h"
+#include "tests/client/files/TSystemCalls.h"
+
+namespace NORVZEL20 {
+namespace {
+
+const char kBefore[] = "what was there before";
+
+/// Results that are written while a call of the operating system fails.
+class WritingFaultTest : public ClientTest {
+  protected:
+    void SetUp() override
+    {
+        ClientTest::SetUp();
+        std::ofstream(fReport, std::ios::binary) << kBefore;
+    }
+
+    void ExpectAsBefore() const
+    {
+        EXPECT_EQ(kBefore, ReadFile(fReport));
+        EXPECT_EQ("report ", fFolder.List());
+    }
+
+    const std::vector<std::string> WriteReport() const { return {"show", "web02.xml", "--output", fReport}; }
+
+    const TOutputFolder fFolder;
+    const std::string fReport = fFolder / "report";
+};
+
+TEST_F(WritingFaultTest, EachCallThatFailsIsToldAndLeavesWhatWasThere)
+{
+    const struct {
+        const char* call;
+        int number;
+    } rows[] = {{"mkostemp", 1}, {"write", 1}, {"fchmod", 1}, {"fsync", 1}, {"close", 2}, {"rename", 1}};
+    for (const auto& row : rows) {
+        for (const int error : {ENOSPC, EIO, EDQUOT, EROFS}) {
+            TSystemCalls calls;
+            calls.Fail(row.call, row.number, error);
+            EXPECT_EQ(std::string("cimdelta: R: cannot be written: ") + std::strerror(error) + "\n",
+                      Shorten(Complaint(WriteReport()), fReport, "R"))
+                << row.call;
+            ExpectAsBefore();
+        }
+    }
+}
+
+TEST_F(WritingFaultTest, RoomThatEndsAnywhereLeavesWhatWasThere)
+{
+    int number = 0;
+    for (bool reached = true; reached;) {
+        TSystemCalls calls;
+        calls.LimitPieces(16);
+        calls.Fail("write", ++number, ENOSPC);
+        Run(WriteReport());
+        reached = calls.GetCount("write") >= number;
+        if (reached) {
+            EXPECT_EQ("cimdelta: R: cannot be written: No space left on device\n", Shorten(fErr, fReport, "R"));
+            EXPECT_EQ(2, fStatus);
+            ExpectAsBefore();
+        }
+    }
+    EXPECT_LT(5, number);
+    EXPECT_EQ(0, fStatus);
+    EXPECT_EQ(Result({"show", "web02.xml"}), ReadFile(fReport));
+}
+
+TEST_F(WritingFaultTest, AnInterruptedCallIsRepeated)
+{
+    for (const int error : {EINTR, EAGAIN}) {
+        TSystemCalls calls;
+        calls.LimitPieces(16);
+        calls.Fail("write", 3, error);
+        Result(WriteReport());
+        EXPECT_EQ(Result({"show", "web02.xml"}), ReadFile(fReport));
+    }
+}
+
+TEST_F(WritingFaultTest, StandardOutputThatCannotBeWrittenIsTold)
+{
+    TSystemCalls calls;
+    TStandardConsole console;
+    calls.Fail("write", 1, EIO);
+    try {
+        console.WriteResult("a result");
+        FAIL() << "written";
+    } catch (const TClientError& error) {
+        EXPECT_STREQ("standard output cannot be written: Input/output error", error.what());
+    }
+}
+
+TEST_F(WritingFaultTest, RulesThatCannotBeKeptAreTold)
+{
+    setenv("TMPDIR", fFolder.GetPath().c_str(), 1);
+    for (const char* const call : {"mkostemp", "write", "close"}) {
+        TSystemCalls calls;
+        calls.Fail(call, call == std::string("close") ? 3 : 1, ENOSPC);
+        const std::string told = Complaint({"compare", "web01.xml", "web02.xml"});
+        EXPECT_EQ("cimdelta: " + fFolder.GetPath() + "/cimdelta-", told.substr(0, fFolder.GetPath().size() + 20)) << call;
+        EXPECT_NE(std::string::npos, told.find(": No space left on device; TMPDIR names the folder\n")) << told;
+        ExpectAsBefore();
+    }
+    unsetenv("TMPDIR");
+}
+
+}  // namespace
+}  // namespace NORVZEL20

@@ -1,0 +1,154 @@
+#include "client/rules/TRuleTrace.h"
+
+#include <gtest/gtest.h>
+
+#include <random>
+
+#include "client/inventory/CimWalk.h"
+#include "embedded/store/TInMemNamespace.h"
+#include "spec/TDiffClassRules.h"
+
+namespace NORVZEL20 {
+namespace {
+
+// A small tree: A above B and C, B above D and E; each declares p, q and r through A.
+boost::shared_ptr<TInMemNamespace> MakeSchema()
+{
+    const boost::shared_ptr<TInMemNamespace> ns = TInMemNamespace::Create("root/cimv2");
+    const auto add = [&ns](const char* name, const char* super) {
+        const boost::shared_ptr<TInMemClass> cls = ns->AllocateInMemClass(name, ns->FindClass(super));
+        cls->AddToNamespace(TCallContext());
+        return cls;
+    };
+    const boost::shared_ptr<TInMemClass> top = add("A", "");
+    for (const char* property : {"p", "q", "r"}) {
+        top->AddPropertyDecl(top->AllocatePropertyDecl(property, TCIMValue(""), TCallContext()));
+    }
+    add("B", "A");
+    add("C", "A");
+    add("D", "B");
+    add("E", "B");
+    return ns;
+}
+
+TRulesDocument MakeRandomDocument(std::mt19937& random)
+{
+    const auto choose = [&random](unsigned int count) { return static_cast<unsigned int>(random() % count); };
+    const auto treatment = [&choose] { return choose(2) == 0 ? TCIMDiffEngine::INCLUDE : TCIMDiffEngine::EXCLUDE; };
+    TRulesDocument document;
+    unsigned int line = 1;
+    for (unsigned int i = choose(7); i > 0; --i) {
+        TRulesDocument::TElement element;
+        element.className = std::string(1, static_cast<char>('A' + choose(5)));
+        element.defaultTreatment = treatment();
+        element.line = ++line;
+        for (unsigned int j = choose(4); j > 0; --j) {
+            element.listed.push_back({std::string(1, static_cast<char>('p' + choose(3))), treatment(), ++line});
+        }
+        if (choose(3) == 0) {
+            element.excludedKeys.push_back(std::string(1, static_cast<char>('p' + choose(3))));
+        }
+        document.elements.push_back(element);
+    }
+    return document;
+}
+
+// What the plug-in makes of the same elements.
+TCIMDiffEngine::TRuleset MakeRuleset(const TRulesDocument& document, const boost::shared_ptr<ICIMNamespace>& schema)
+{
+    TCIMDiffEngine::TRuleset ruleset;
+    for (const TRulesDocument::TElement& element : document.elements) {
+        std::map<std::string, TCIMDiffEngine::propType> listed;
+        for (const TRulesDocument::TListed& entry : element.listed) {
+            listed.insert({entry.property, entry.treatment});
+        }
+        const boost::shared_ptr<TCIMDiffEngine::TDiffClassRules> rules(
+            new TCIMDiffEngine::TDiffClassRules(element.defaultTreatment, listed, element.excludedKeys));
+        ruleset.addToRuleset(element.className, rules, true);
+        ruleset.updateRuleset(element.className, "", schema);
+    }
+    return ruleset;
+}
+
+TEST(RuleTrace, AgreesWithThePlugInOnRandomRules)
+{
+    const boost::shared_ptr<TInMemNamespace> schema = MakeSchema();
+    for (unsigned int seed = 0; seed < 3000; ++seed) {
+        SCOPED_TRACE("seed " + std::to_string(seed));
+        std::mt19937 random(seed);
+        const TRulesDocument document = MakeRandomDocument(random);
+        TCIMDiffEngine::TRuleset ruleset = MakeRuleset(document, schema);
+        const TRuleTrace trace(document, schema);
+        for (const char* name : {"A", "B", "C", "D", "E"}) {
+            const boost::shared_ptr<TCIMDiffEngine::TDiffClassRules> rules = ruleset.getClassRules(name);
+            ASSERT_EQ(rules->fDefault, trace.Find(name).byDefault.treatment) << name;
+            ASSERT_EQ(rules->fExcludedKeys, trace.Find(name).excludedKeys) << name;
+            for (const char* property : {"p", "q", "r"}) {
+                const auto listed = rules->fProperties.find(property);
+                const TCIMDiffEngine::propType expected = listed == rules->fProperties.end() ? rules->fDefault : listed->second;
+                ASSERT_EQ(expected, trace.Decide(name, property).treatment) << name << "." << property;
+            }
+        }
+    }
+}
+
+std::string WarningsFor(const TRulesDocument& document)
+{
+    const TRuleTrace trace(document, MakeSchema());
+    std::string text;
+    for (const TRuleTrace::TWarning& warning : trace.GetWarnings()) {
+        text += std::to_string(warning.line) + " " + warning.text + "\n";
+    }
+    return text;
+}
+
+TRulesDocument::TElement Element(unsigned int line, const char* className, std::vector<std::string> excludedKeys = {})
+{
+    TRulesDocument::TElement element;
+    element.line = line;
+    element.className = className;
+    element.excludedKeys = std::move(excludedKeys);
+    return element;
+}
+
+TEST(RuleTrace, OrdinaryRulesGetNoWarning)
+{
+    EXPECT_EQ("", WarningsFor({{Element(2, "A"), Element(3, "B"), Element(4, "D")}}));
+}
+
+TEST(RuleTrace, ASecondElementIsStillInOrder)
+{
+    EXPECT_EQ("", WarningsFor({{Element(2, "C"), Element(3, "C")}}));
+}
+
+TEST(RuleTrace, AThirdElementHasNoEffect)
+{
+    EXPECT_EQ(
+        "4 this element for class C has no effect: the class's rules were complete before it (its first element is at line 2); put "
+        "everything into one element\n",
+        WarningsFor({{Element(2, "C"), Element(3, "C"), Element(4, "C")}}));
+}
+
+TEST(RuleTrace, ASecondElementHasNoEffectBelowAnAncestor)
+{
+    EXPECT_EQ(
+        "4 this element for class B has no effect: the class's rules were complete before it (its first element is at line 3); put "
+        "everything into one element\n",
+        WarningsFor({{Element(2, "A"), Element(3, "B"), Element(4, "B")}}));
+}
+
+TEST(RuleTrace, AnElementBeforeItsAncestorsIsOverruled)
+{
+    EXPECT_EQ("2 the element for class D is read before that of its ancestor A (line 3), whose default and lists replace its own; "
+              "put the "
+              "ancestor first\n",
+              WarningsFor({{Element(2, "D"), Element(3, "A")}}));
+}
+
+TEST(RuleTrace, WhatIsNoKeyIsTold)
+{
+    EXPECT_EQ("2 excluded key p is no key of class A\n", WarningsFor({{Element(2, "A", {"p"})}}));
+}
+
+}  // namespace
+}  // namespace NORVZEL20

@@ -1,0 +1,75 @@
+#include "client/text/DisplayText.h"
+
+#include <gtest/gtest.h>
+
+#include "host/TCIMReference.h"
+
+namespace NORVZEL20 {
+namespace {
+
+TEST(EscapeForDisplay, LeavesOrdinaryTextAlone)
+{
+    EXPECT_EQ("Gr\u00fc\u00dfe, \u4e16\u754c \\ \" '", EscapeForDisplay("Gr\u00fc\u00dfe, \u4e16\u754c \\ \" '"));
+}
+
+TEST(EscapeForDisplay, ShowsWhatWouldActOnATerminal)
+{
+    const struct {
+        std::string text;
+        const char* shown;
+    } rows[] = {
+        {"a\nb", "a\\nb"},
+        {"a\r\tb", "a\\r\\tb"},
+        {"\x1b[31m", "\\x1b[31m"},
+        {std::string("\0", 1), "\\x00"},
+        {"\x7f", "\\x7f"},
+        {"\xc2\x9b", "\\u009b"},  // the one-character form of ESC [
+        {"\xe2\x80\xae"
+         "abc",
+         "\\u202eabc"},  // writes backwards
+        {"\xff", "\\xff"},
+        {"\xc3", "\\xc3"},
+        {"\xc3(", "\\xc3("},
+        {"\xe2\x82", "\\xe2\\x82"},
+    };
+    for (const auto& row : rows) {
+        EXPECT_EQ(row.shown, EscapeForDisplay(row.text));
+    }
+}
+
+TEST(DisplayValue, TellsTextsApartThatLookAlike)
+{
+    const struct {
+        TCIMValue value;
+        const char* shown;
+    } rows[] = {
+        {TCIMValue("4.19"), "4.19"},
+        {TCIMValue("two words"), "two words"},
+        {TCIMValue(""), "\"\""},
+        {TCIMValue("NULL"), "\"NULL\""},
+        {TCIMValue(), "NULL"},
+        {TCIMValue::Null(TCIMValue::TCIMType::kString), "NULL"},
+        {TCIMValue(" web"), "\" web\""},
+        {TCIMValue("web "), "\"web \""},
+        {TCIMValue("a -> b"), "\"a -> b\""},
+        {TCIMValue("a / b"), "\"a / b\""},
+        {TCIMValue("C:\\x"), "\"C:\\\\x\""},
+        {TCIMValue("say \"x\""), "\"say \\\"x\\\"\""},
+        {TCIMValue("a\nb"), "\"a\\nb\""},
+        {TCIMValue(7u), "7"},
+        {TCIMValue(true), "TRUE"},
+    };
+    for (const auto& row : rows) {
+        EXPECT_EQ(row.shown, DisplayValue(row.value));
+    }
+}
+
+TEST(DisplayValue, ShowsArraysInBraces)
+{
+    const std::vector<TCIMValue> elements = {TCIMValue("a"), TCIMValue("b\x1b")};
+    EXPECT_EQ("{\"a\", \"b\\x1b\"}", DisplayValue(TCIMValue(TCIMValue::TCIMType::kArrayString, 2, elements)));
+    EXPECT_EQ("{}", DisplayValue(TCIMValue(TCIMValue::TCIMType::kArrayString, 0, {})));
+}
+
+}  // namespace
+}  // namespace NORVZEL20

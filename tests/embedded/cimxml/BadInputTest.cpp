@@ -1,0 +1,159 @@
+#include <gtest/gtest.h>
+
+#include <string>
+
+#include "embedded/cimxml/TCimXmlContext.h"
+#include "host/TZELException.h"
+#include "tests/embedded/cimxml/TLoading.h"
+
+namespace NORVZEL20 {
+namespace {
+
+using L = TLoading;
+
+struct TRow {
+    const char* what;
+    std::string document;
+    int status;
+    std::string message;
+};
+
+const std::string kHead = "<CIM CIMVERSION=\"2.0\" DTDVERSION=\"2.0\"><DECLARATION><DECLGROUP>\n";
+const std::string kCounter = "<PROPERTY NAME=\"N\" TYPE=\"uint8\"/>";
+
+std::string ClassWithCounter()
+{
+    return L::Class("A", kCounter);
+}
+
+const TRow kRows[] = {
+    {"empty", "", 9, "doc.xml:1:1: found an empty document, expected CIM-XML"},
+    {"blank", "\n\n", 9, "doc.xml:3:1: found malformed XML: no element found"},
+    {"no XML at all", "hello", 9, "doc.xml:1:1: found malformed XML: syntax error"},
+    {"truncated", kHead + "<VALUE.OBJECT>\n", 9, "doc.xml:3:1: found malformed XML: no element found"},
+    {"truncated in a tag", kHead + "<VALUE.OBJ", 9, "doc.xml:2:1: found malformed XML: unclosed token"},
+    {"malformed", kHead + "<VALUE.OBJECT></CLASS>", 9, "doc.xml:2:17: found malformed XML: mismatched tag"},
+    {"a NUL", kHead + std::string("<VALUE.OBJECT>\0", 15), 9, "doc.xml:2:15: found malformed XML: not well-formed (invalid token)"},
+    {"no UTF-8", L::Group(ClassWithCounter() + L::Instance("A", "\xFF")), 9,
+     "doc.xml:3:80: found malformed XML: not well-formed (invalid token)"},
+    {"unknown encoding", "<?xml version=\"1.0\" encoding=\"EBCDIC-42\"?><CIM/>", 9,
+     "doc.xml:1:31: found malformed XML: unknown encoding"},
+    {"another document", "<html/>", 9, "doc.xml:1:1: found element <html> as the outermost element, expected <CIM>"},
+    {"unknown element", L::Group("<VALUE.OBJCT/>"), 9,
+     "doc.xml:2:1: found element <VALUE.OBJCT> in <DECLGROUP>, expected <LOCALNAMESPACEPATH>, <NAMESPACEPATH>, "
+     "<QUALIFIER.DECLARATION>, <VALUE.OBJECT>, <VALUE.NAMEDOBJECT>, <VALUE.NAMEDINSTANCE>, <VALUE.OBJECTWITHPATH>, "
+     "<VALUE.OBJECTWITHLOCALPATH>, <VALUE.INSTANCEWITHPATH>, <CLASS> or <INSTANCE>"},
+    {"misplaced element", L::Group("<VALUE.OBJECT><VALUE/></VALUE.OBJECT>"), 9,
+     "doc.xml:2:15: found element <VALUE> in <VALUE.OBJECT>, expected <CLASS>, <INSTANCE>, <CLASSPATH>, <LOCALCLASSPATH>, "
+     "<INSTANCEPATH>, <LOCALINSTANCEPATH> or <INSTANCENAME>"},
+    {"text between elements", L::Group(" oops "), 9, "doc.xml:2:7: found text \". oops \" in <DECLGROUP>, expected elements alone"},
+    {"no name", L::Group("<VALUE.OBJECT><CLASS/></VALUE.OBJECT>"), 9,
+     "doc.xml:2:15: found <CLASS> without NAME, expected that attribute with a value"},
+    {"empty object", L::Group("<VALUE.OBJECT></VALUE.OBJECT>"), 9,
+     "doc.xml:2:15: found an object without contents, expected a <CLASS> or an <INSTANCE> in it"},
+    {"unknown type", L::Group(L::Class("A", "<PROPERTY NAME=\"N\" TYPE=\"uint9\"/>")), 9,
+     "doc.xml:2:164: found type \"uint9\", expected a CIM type such as string or uint32"},
+    {"unknown class", L::Group(ClassWithCounter() + L::Instance("B", "1")), 15,
+     "doc.xml:3:15: found an instance of class \"B\", which is not declared; add its <CLASS> to the document or load it before"},
+    {"unknown superclass", L::Group("<VALUE.OBJECT><CLASS NAME=\"A\" SUPERCLASS=\"B\"/></VALUE.OBJECT>"), 15,
+     "doc.xml:2:15: found class \"A\" with the superclass \"B\", which is not declared; add its <CLASS> to the document or load it "
+     "before"},
+    {"class below itself", L::Group("<VALUE.OBJECT><CLASS NAME=\"A\" SUPERCLASS=\"a\"/></VALUE.OBJECT>"), 15,
+     "doc.xml:2:15: found class \"A\" with the superclass \"a\", which in the end is below it or below an undeclared class"},
+    {"unknown property", L::Group(ClassWithCounter() + L::Instance("A", "1", L::Property("M", "uint8", "1"))), 15,
+     "doc.xml:3:100: found property \"M\", but class \"A\" declares none of that name; add its declaration or correct the name"},
+    {"second instance", L::Group(ClassWithCounter() + L::Instance("A", "1") + L::Instance("A", "1")), 12,
+     "doc.xml:4:100: found a second instance root/cimv2:A.Id=\"1\"; instances of class \"A\" must differ in their keys"},
+    {"key without value", L::Group(ClassWithCounter() + "<INSTANCE CLASSNAME=\"A\"/>"), 14,
+     "doc.xml:3:26: found an instance of class \"A\" without a value for its key \"Id\"; every key needs one"},
+    {"value out of range", L::Group(ClassWithCounter() + L::Instance("A", "1", L::Property("N", "uint8", "300"))), 13,
+     "doc.xml:3:142: found \"300\" as value of \"N\", expected a uint8"},
+    {"value of another type", L::Group(ClassWithCounter() + L::Instance("A", "1", L::Property("N", "string", "x"))), 13,
+     "doc.xml:3:149: found \"x\" of type string in property \"N\", which class \"A\" declares as uint8"},
+    {"property twice", L::Group(ClassWithCounter() + L::Instance("A", "1", L::Property("ID", "string", "2"))), 9,
+     "doc.xml:3:100: found property \"ID\" a second time in one instance"},
+    {"value twice", L::Group(L::Class("A", "<PROPERTY NAME=\"N\" TYPE=\"uint8\"><VALUE>1</VALUE><VALUE>2</VALUE></PROPERTY>")), 9,
+     "doc.xml:2:212: found a second value for \"N\", expected one"},
+    {"class twice, differing", L::Group(L::Class("A") + ClassWithCounter()), 12,
+     "doc.xml:3:15: found a second, different declaration of class \"A\"; remove one"},
+    {"recorded error", "<CIM><MESSAGE><SIMPLERSP><IMETHODRESPONSE><ERROR CODE=\"6\" DESCRIPTION=\"gone\"/>", 9,
+     "doc.xml:1:43: found a response with error 6 (\"gone\"), expected one with objects"},
+    {"two namespaces",
+     L::Group("<LOCALNAMESPACEPATH><NAMESPACE NAME=\"a\"/></LOCALNAMESPACEPATH>\n"
+              "<LOCALNAMESPACEPATH><NAMESPACE NAME=\"b\"/></LOCALNAMESPACEPATH>\n"),
+     9, "doc.xml:3:42: found namespace \"b\" after \"a\"; one document is one namespace, split this one"},
+};
+
+TEST(BadInputTest, EachGetsOneMessageAndLeavesNothing)
+{
+    for (const TRow& row : kRows) {
+        TLoading loading;
+        const std::string before = loading.Write();
+        EXPECT_EQ(row.message, loading.ErrorOf(row.document)) << row.what;
+        EXPECT_EQ(before, loading.Write()) << row.what;
+        EXPECT_EQ(row.status, loading.StatusOf(row.document)) << row.what;
+    }
+}
+
+TEST(BadInputTest, AMissingFileIsToldByItsName)
+{
+    TLoading loading;
+    try {
+        loading.LoadFile("/nowhere/inventory.xml");
+        FAIL();
+    } catch (const TZELException& error) {
+        EXPECT_STREQ("/nowhere/inventory.xml: cannot open the file: No such file or directory", error.what());
+        EXPECT_EQ(11, error.GetStatusCode().GetStatus());
+    }
+}
+
+TEST(BadInputTest, ADirectoryIsNoFile)
+{
+    TLoading loading;
+    try {
+        loading.LoadFile("/");
+        FAIL();
+    } catch (const TZELException& error) {
+        EXPECT_STREQ("/: cannot read the file: Is a directory", error.what());
+    }
+}
+
+TEST(BadInputTest, AHugeNameIsCutInTheMessage)
+{
+    TLoading loading;
+    const std::string message = loading.ErrorOf(L::Group("<" + std::string(1 << 20, 'x') + "/>"));
+    EXPECT_EQ("doc.xml:2:1: found element <" + std::string(80, 'x') + "...> in <DECLGROUP>", message.substr(0, 127));
+}
+
+TEST(BadInputTest, AFailedLoadTakesBackWhatItAddedToClassesThatWereThere)
+{
+    TLoading loading;
+    loading.Load(L::Group(L::Class("A") + L::Instance("A", "old")));
+    EXPECT_EQ(12, loading.StatusOf(L::Group(L::Instance("A", "new") + L::Instance("A", "old"))));
+    EXPECT_EQ("root/cimv2:A.Id=\"old\"\n", loading.PathsOf("A"));
+}
+
+TEST(CimXmlContextTest, WhatTheNamespaceRefusesEndsTheLoadAtItsPlace)
+{
+    TCimXmlContext context("doc.xml");
+    const TCimXmlContext::TAt at(context, {3, 4});
+    const auto errorOf = [&context](const TZELException& error) {
+        try {
+            context.Guard([&] { throw error; });
+            return std::string();
+        } catch (const TPopulateError& told) {
+            return std::to_string(told.GetStatusCode().GetStatus()) + " " + told.what();
+        }
+    };
+    EXPECT_EQ("13 doc.xml:3:4: found what cannot be taken: Type mismatch", errorOf(TZELException(TZELStatusCode::kTypeMismatch)));
+    EXPECT_EQ(5, context.Guard([] { return 5; }));
+    try {
+        context.Guard([] { throw TPopulateError(TZELStatusCode::kParseError, "told", "other.xml", 1, 2); });
+        ADD_FAILURE() << "nothing was thrown";
+    } catch (const TPopulateError& told) {
+        EXPECT_STREQ("other.xml:1:2: told", told.what());
+    }
+}
+
+}  // namespace
+}  // namespace NORVZEL20

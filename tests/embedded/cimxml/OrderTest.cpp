@@ -1,0 +1,173 @@
+#include <gtest/gtest.h>
+
+#include <algorithm>
+#include <set>
+
+#include "tests/embedded/cimxml/TLoading.h"
+
+namespace NORVZEL20 {
+namespace {
+
+const char kKey[] = "<QUALIFIER NAME=\"Key\" TYPE=\"boolean\" OVERRIDABLE=\"false\"><VALUE>TRUE</VALUE></QUALIFIER>";
+
+std::string Object(const std::string& element)
+{
+    return "<VALUE.OBJECT>" + element + "</VALUE.OBJECT>\n";
+}
+
+/// A path as careless writers write it: names in another letter case, numbers as text.
+std::string DiskPath(const std::string& id)
+{
+    return "<VALUE.REFERENCE><INSTANCENAME CLASSNAME=\"disk\"><KEYBINDING NAME=\"id\"><KEYVALUE VALUETYPE=\"string\">" + id +
+           "</KEYVALUE></KEYBINDING></INSTANCENAME></VALUE.REFERENCE>";
+}
+
+std::string PartPath(const std::string& id)
+{
+    return "<VALUE.REFERENCE><INSTANCENAME CLASSNAME=\"PART\"><KEYBINDING NAME=\"ON\">" + DiskPath(id) +
+           "</KEYBINDING></INSTANCENAME></VALUE.REFERENCE>";
+}
+
+std::string ReferenceTo(const std::string& name, const std::string& path)
+{
+    return "<PROPERTY.REFERENCE NAME=\"" + name + "\">" + path + "</PROPERTY.REFERENCE>";
+}
+
+std::string Escaped(const std::string& xml)
+{
+    std::string text;
+    for (const char c : xml) {
+        text += c == '<' ? "&lt;" : std::string(1, c);
+    }
+    return text;
+}
+
+/// Every value of the namespace, a line for each, sorted.
+std::string ContentsOf(const TLoading& loading)
+{
+    std::set<std::string> lines;
+    for (const boost::shared_ptr<TInMemClass>& cls : loading.GetNamespace()->GetClasses()) {
+        cls->EnumerateInstances(
+            [&lines](boost::shared_ptr<ICIMInstance> instance) {
+                const std::string path = instance->GetReference(TCallContext()).GetPath();
+                instance->EnumerateProperties(
+                    [&](boost::shared_ptr<ICIMProperty> property) {
+                        lines.insert(path + " " + property->GetPropertyDecl(TCallContext())->GetName(TCallContext()) + " " +
+                                     property->GetValue(TCallContext()).ToText() + "\n");
+                        return true;
+                    },
+                    TCallContext());
+                return true;
+            },
+            false, TCallContext());
+    }
+    std::string text;
+    for (const std::string& line : lines) {
+        text += line;
+    }
+    return text;
+}
+
+/// What the contents are in every order of the elements; several texts, one below the other, where they are not always the same.
+std::string ContentsInEveryOrder(std::vector<std::string> elements)
+{
+    std::sort(elements.begin(), elements.end());
+    std::set<std::string> contents;
+    do {
+        std::string group;
+        for (const std::string& element : elements) {
+            group += element;
+        }
+        TLoading loading;
+        loading.Load(TLoading::Group(group));
+        contents.insert(ContentsOf(loading));
+    } while (std::next_permutation(elements.begin(), elements.end()));
+    std::string text;
+    for (const std::string& one : contents) {
+        text += (&one == &*contents.begin() ? "" : "or\n") + (one.empty() ? "nothing\n" : one);
+    }
+    return text;
+}
+
+const std::string kDisk =
+    Object(std::string("<CLASS NAME=\"Disk\"><PROPERTY NAME=\"Id\" TYPE=\"uint32\">") + kKey + "</PROPERTY></CLASS>");
+
+TEST(OrderTest, AReferenceIsWrittenAsItsClassIsDeclaredWhereverThatStands)
+{
+    const std::string use = Object(std::string("<CLASS NAME=\"Use\"><PROPERTY NAME=\"Id\" TYPE=\"string\">") + kKey +
+                                   "</PROPERTY><PROPERTY.REFERENCE NAME=\"On\"/><PROPERTY.REFARRAY NAME=\"All\"/></CLASS>");
+    const std::string all = "<PROPERTY.REFARRAY NAME=\"All\"><VALUE.REFARRAY>" + DiskPath("6") + DiskPath("7") +
+                            "</VALUE.REFARRAY></PROPERTY.REFARRAY>";
+    EXPECT_EQ("root/cimv2:Use.Id=\"a\" All {Disk.Id=6, Disk.Id=7}\n"
+              "root/cimv2:Use.Id=\"a\" Id a\n"
+              "root/cimv2:Use.Id=\"a\" On Disk.Id=5\n",
+              ContentsInEveryOrder({kDisk, use, TLoading::Instance("Use", "a", ReferenceTo("On", DiskPath("5")) + all)}));
+}
+
+TEST(OrderTest, SoIsOneThatIsAKeyAndOneWithinAKey)
+{
+    const std::string part = Object(std::string("<CLASS NAME=\"Part\"><PROPERTY.REFERENCE NAME=\"On\">") + kKey +
+                                    "</PROPERTY.REFERENCE><PROPERTY.REFERENCE NAME=\"Next\"/></CLASS>");
+    const std::string instance = Object("<INSTANCE CLASSNAME=\"Part\">" + ReferenceTo("On", DiskPath("1")) +
+                                        ReferenceTo("Next", PartPath("2")) + "</INSTANCE>");
+    EXPECT_EQ("root/cimv2:Part.On=\"Disk.Id=1\" Next Part.On=\"Disk.Id=2\"\n"
+              "root/cimv2:Part.On=\"Disk.Id=1\" On Disk.Id=1\n",
+              ContentsInEveryOrder({kDisk, part, instance}));
+}
+
+TEST(OrderTest, AKeyLeftOutAndTakenFromTheNameInFrontIsWrittenSoToo)
+{
+    const std::string part =
+        Object(std::string("<CLASS NAME=\"Part\"><PROPERTY.REFERENCE NAME=\"On\">") + kKey + "</PROPERTY.REFERENCE></CLASS>");
+    const std::string instance = "<VALUE.NAMEDINSTANCE><INSTANCENAME CLASSNAME=\"Part\"><KEYBINDING NAME=\"On\">" + DiskPath("1") +
+                                 "</KEYBINDING></INSTANCENAME><INSTANCE CLASSNAME=\"Part\"/></VALUE.NAMEDINSTANCE>\n";
+    EXPECT_EQ("root/cimv2:Part.On=\"Disk.Id=1\" On Disk.Id=1\n", ContentsInEveryOrder({kDisk, part, instance}));
+}
+
+TEST(OrderTest, WhatADeclarationSaysIsAnObjectIsOneWhereverTheDeclarationStands)
+{
+    const std::string box = Object(std::string("<CLASS NAME=\"Box\"><PROPERTY NAME=\"Id\" TYPE=\"string\">") + kKey +
+                                   "</PROPERTY><PROPERTY NAME=\"In\" TYPE=\"string\"><QUALIFIER NAME=\"EmbeddedInstance\" "
+                                   "TYPE=\"string\"><VALUE>Thing</VALUE></QUALIFIER></PROPERTY><PROPERTY.ARRAY NAME=\"Also\" "
+                                   "TYPE=\"string\"><QUALIFIER NAME=\"EmbeddedObject\" TYPE=\"boolean\"><VALUE>TRUE</VALUE>"
+                                   "</QUALIFIER></PROPERTY.ARRAY></CLASS>");
+    const std::string thing = Escaped("<INSTANCE CLASSNAME=\"Thing\">" + ReferenceTo("On", DiskPath("3")) + "</INSTANCE>");
+    const std::string also = "<PROPERTY.ARRAY NAME=\"Also\" TYPE=\"string\"><VALUE.ARRAY><VALUE>plain</VALUE><VALUE>" + thing +
+                             "</VALUE></VALUE.ARRAY></PROPERTY.ARRAY>";
+    const std::string object = "<INSTANCE CLASSNAME=\"Thing\"><PROPERTY.REFERENCE NAME=\"On\"><VALUE.REFERENCE><INSTANCENAME "
+                               "CLASSNAME=\"Disk\"><KEYBINDING NAME=\"Id\"><KEYVALUE VALUETYPE=\"numeric\" TYPE=\"uint32\">3"
+                               "</KEYVALUE></KEYBINDING></INSTANCENAME></VALUE.REFERENCE></PROPERTY.REFERENCE></INSTANCE>";
+    EXPECT_EQ("root/cimv2:Box.Id=\"a\" Also {\"plain\", " + object +
+                  "}\nroot/cimv2:Box.Id=\"a\" Id a\nroot/cimv2:Box.Id=\"a\" In " + object + "\n",
+              ContentsInEveryOrder({kDisk, box, TLoading::Instance("Box", "a", TLoading::Property("In", "string", thing) + also)}));
+}
+
+TEST(OrderTest, InstancesOfAClassStayInTheDocumentsOrder)
+{
+    TLoading loading;
+    const std::string part =
+        Object(std::string("<CLASS NAME=\"Part\"><PROPERTY.REFERENCE NAME=\"On\">") + kKey + "</PROPERTY.REFERENCE></CLASS>");
+    const auto instance = [](const std::string& path) {
+        return Object("<INSTANCE CLASSNAME=\"Part\">" + ReferenceTo("On", path) + "</INSTANCE>");
+    };
+    loading.Load(TLoading::Group(TLoading::Class("Room") + part + instance(DiskPath("2")) +
+                                 instance("<VALUE.REFERENCE><CLASSNAME NAME=\"Room\"/></VALUE.REFERENCE>") +
+                                 instance(DiskPath("1")) + kDisk));
+    EXPECT_EQ("root/cimv2:Part.On=\"Disk.Id=2\"\nroot/cimv2:Part.On=\"Room\"\nroot/cimv2:Part.On=\"Disk.Id=1\"\n",
+              loading.PathsOf("Part"));
+}
+
+TEST(OrderTest, TwoKeysThatAreOneAsDeclaredAreRefusedWithTheirPlace)
+{
+    TLoading loading;
+    const std::string part =
+        Object(std::string("<CLASS NAME=\"Part\"><PROPERTY.REFERENCE NAME=\"On\">") + kKey + "</PROPERTY.REFERENCE></CLASS>");
+    const std::string instance = Object("<INSTANCE CLASSNAME=\"Part\">" + ReferenceTo("On", DiskPath("1")) + "</INSTANCE>");
+    const std::string other = Object("<INSTANCE CLASSNAME=\"Part\">" + ReferenceTo("On", DiskPath("01")) + "</INSTANCE>");
+    EXPECT_EQ("doc.xml:4:251: found a second instance root/cimv2:Part.On=\"Disk.Id=1\"; instances of class \"Part\" must differ in "
+              "their keys",
+              loading.ErrorOf(TLoading::Group(part + instance + other + kDisk)));
+}
+
+}  // namespace
+}  // namespace NORVZEL20

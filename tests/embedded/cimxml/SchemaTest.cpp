@@ -1,0 +1,29 @@
+#include <gtest/gtest.h>
+
+#include <cstdlib>
+#include <iostream>
+#include <string>
+
+#include "tests/embedded/cimxml/TLoading.h"
+
+namespace NORVZEL20 {
+namespace {
+
+/// The published qualifier declarations are not part of this project: the environment says where they are.
+TEST(SchemaTest, ThePublishedQualifiersLoadAndComeBackEqual)
+{
+    const char* folder = std::getenv("CIMDELTA_SCHEMA_DIR");
+    if (folder == nullptr) {
+        std::cerr << "NOT CHECKED: CIMDELTA_SCHEMA_DIR does not say where the CIM schema is\n";
+        GTEST_SKIP() << "the schema is not part of the project";
+    }
+    TLoading loading;
+    const TLoadReport report = loading.LoadFile(std::string(folder) + "/cim-2.49.0-qualifiers.xml");
+    EXPECT_EQ(70u, report.qualifierDecls);
+    TLoading again;
+    again.Load(loading.Write());
+    EXPECT_EQ(loading.Write(), again.Write());
+}
+
+}  // namespace
+}  // namespace NORVZEL20

@@ -1,0 +1,102 @@
+#include <malloc.h>
+
+#include <cstdio>
+
+#include "tests/embedded/store/CountedAllocations.h"
+#include "tests/embedded/store/InMemFixture.h"
+
+namespace NORVZEL20 {
+namespace {
+
+std::size_t HeapInUse()
+{
+    const struct mallinfo2 info = mallinfo2();
+    return info.uordblks + info.hblkhd;
+}
+
+#if defined(__SANITIZE_ADDRESS__) || defined(__SANITIZE_THREAD__)
+constexpr bool kOwnHeap = false;  // the sanitizer's heap does not tell what is in use
+#else
+constexpr bool kOwnHeap = true;
+#endif
+
+class InMemMemoryTest : public TInMemFixture {
+  protected:
+    /// Package: 13 properties, eight of them texts of 15 to 40 characters.
+    TClassPointer DeclarePackage()
+    {
+        auto cls = Allocate("Package", nullptr, {{"Name", TType::kString, {"Key"}}, {"Version", TType::kString, {"Key"}}});
+        for (const char* name : {"Vendor", "Section", "Home", "Summary", "Source", "License"}) {
+            cls->AddPropertyDecl(Decl({name, TType::kString, {}}));
+        }
+        for (const char* name : {"Size", "InstalledSize"}) {
+            cls->AddPropertyDecl(Decl({name, TType::kUint64, {}}));
+        }
+        cls->AddPropertyDecl(Decl({"Priority", TType::kUint16, {}}));
+        cls->AddPropertyDecl(Decl({"Essential", TType::kBoolean, {}}));
+        cls->AddPropertyDecl(Decl({"Architecture", TType::kString, {}}));
+        cls->AddToNamespace(none);
+        return cls;
+    }
+
+    static void AddPackage(const TClassPointer& cls, int number)
+    {
+        const auto instance = cls->AllocateInMemInstance();
+        const std::string text = "package number " + std::to_string(number);  // 16 to 20 characters
+        for (std::uint32_t slot = 0; slot < 8; ++slot) {
+            instance->SetSlot(slot, TCIMValue(text + std::string(slot * 3, 'x')));
+        }
+        instance->SetSlot(8, TCIMValue(std::uint64_t(number)));
+        instance->SetSlot(9, TCIMValue(std::uint64_t(number) * 3));
+        instance->SetSlot(10, TCIMValue(static_cast<unsigned short>(5)));
+        instance->SetSlot(11, TCIMValue(false));
+        instance->SetSlot(12, TCIMValue("amd64"));
+        instance->AddToNamespace(TCallContext());
+    }
+};
+
+TEST_F(InMemMemoryTest, AnInstanceOfThirteenPropertiesTakesAtMostAThousandBytes)
+{
+    if (!kOwnHeap) {
+        GTEST_SKIP() << "the heap cannot be measured under a sanitizer";
+    }
+    constexpr int kCount = 100000;
+    const auto cls = DeclarePackage();
+    const std::size_t before = HeapInUse();
+    for (int number = 0; number < kCount; ++number) {
+        AddPackage(cls, number);
+    }
+    const std::size_t each = (HeapInUse() - before) / kCount;
+    RecordProperty("BytesPerInstance", int(each));
+    std::printf("%zu bytes per instance\n", each);
+    EXPECT_GT(each, 500U);
+    EXPECT_LE(each, 1000U);
+}
+
+TEST_F(InMemMemoryTest, ReadingAPropertyAllocatesNothing)
+{
+    const auto cls = DeclarePackage();
+    AddPackage(cls, 1);
+    const std::string name = "architecture";
+    cls->EnumerateInstances(
+        [&](boost::shared_ptr<ICIMInstance> instance) {
+            const std::size_t before = CountedAllocations();
+            const auto property = instance->GetProperty(name, none);
+            const TCIMValue value = property->GetValue(none);
+            EXPECT_EQ(before, CountedAllocations());
+            EXPECT_EQ("amd64", value.GetString());
+            return true;
+        },
+        false, none);
+}
+
+TEST_F(InMemMemoryTest, AnInstanceIsOneAllocation)
+{
+    const auto cls = DeclarePackage();
+    const std::size_t before = CountedAllocations();
+    const auto instance = cls->AllocateInMemInstance();
+    EXPECT_EQ(before + 1, CountedAllocations());
+}
+
+}  // namespace
+}  // namespace NORVZEL20

@@ -1,0 +1,40 @@
+#include <gtest/gtest.h>
+
+#include "embedded/value/TNameText.h"
+
+namespace NORVZEL20 {
+namespace {
+
+TEST(NameTextTest, NamesThatDifferInLetterCaseAreEqualAndHashAlike)
+{
+    EXPECT_TRUE(TNameText::Equal("CIM_Disk", "cim_DISK"));
+    EXPECT_EQ(TNameText::Hash("CIM_Disk"), TNameText::Hash("cim_DISK"));
+    EXPECT_EQ(0, TNameText::Compare("CIM_Disk", "cim_DISK"));
+    EXPECT_FALSE(TNameText::Equal("CIM_Disk", "CIM_Disk2"));
+    EXPECT_FALSE(TNameText::Equal("CIM_Disk", "CIM_Disc"));
+}
+
+TEST(NameTextTest, OnlyAsciiLettersFold)
+{
+    EXPECT_FALSE(TNameText::Equal("\xC3\x84", "\xC3\xA4"));
+    EXPECT_FALSE(TNameText::Equal("a[", "a{"));
+    EXPECT_EQ("abc[\xC3\x84", TNameText::ToLower("ABC[\xC3\x84"));
+}
+
+TEST(NameTextTest, OrderIsThatOfTheLowerCaseBytes)
+{
+    EXPECT_LT(TNameText::Compare("a", "B"), 0);
+    EXPECT_LT(TNameText::Compare("Key", "Key2"), 0);
+    EXPECT_GT(TNameText::Compare("\xC3\x84", "z"), 0);
+    EXPECT_LT(TNameText::Compare("A_", "AB"), 0) << "an underscore stands before lower-case letters";
+}
+
+TEST(NameTextTest, MapsFindANameInAnySpelling)
+{
+    TNameMap<int> byName{{"Name", 1}};
+    EXPECT_EQ(1, byName.find("NAME")->second);
+    EXPECT_EQ(byName.end(), byName.find("Nam"));
+}
+
+}  // namespace
+}  // namespace NORVZEL20
