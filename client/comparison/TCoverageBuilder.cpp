@@ -32,7 +32,7 @@ void TCoverageBuilder::AddClass(TCoverage& coverage, const std::string& classNam
     TCoverage::TClass cls;
     cls.name = className;
     cls.instances = CountInstances(className);
-    if (std::accumulate(cls.instances.begin(), cls.instances.end(), std::size_t(0)) == 0) {
+    if (std::accumulate(cls.instances.begin(), cls.instances.end(), static_cast<std::size_t>(0)) == 0) {
         ++coverage.classesWithout;
         return;
     }

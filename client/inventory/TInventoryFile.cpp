@@ -21,7 +21,7 @@ const struct {
 } kNotUnderstood[] = {{"BZh", "bzip2"}, {"\x04\x22\x4d\x18", "lz4"}, {"PK\x03\x04", "zip"}, {"LZIP", "lzip"}};
 
 const std::size_t kBlockSize = 64 * 1024;
-const std::size_t kMostToCheck = std::size_t(1) << 30;
+const std::size_t kMostToCheck = static_cast<std::size_t>(1) << 30;
 
 bool BeginsWith(const std::string& text, const std::string& begin)
 {

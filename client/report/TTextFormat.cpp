@@ -142,7 +142,7 @@ std::string TTextFormat::Labels(const std::vector<std::size_t>& inventories) con
 std::string TTextFormat::Others() const
 {
     std::vector<std::size_t> others(fReport.labels.size() - 1);
-    std::iota(others.begin(), others.end(), std::size_t(1));
+    std::iota(others.begin(), others.end(), static_cast<std::size_t>(1));
     return Labels(others);
 }
 

@@ -14,9 +14,11 @@ class TCimXmlAttributes {
     /// The value, or null where the element has no such attribute.
     const char* Find(const char* name) const noexcept
     {
-        for (const char** next = fAttributes; *next != nullptr; next += 2)
-            if (*next[0] == *name && std::strcmp(next[0], name) == 0)  // mostly the first character decides
+        for (const char** next = fAttributes; *next != nullptr; next += 2) {
+            if (*next[0] == *name && std::strcmp(next[0], name) == 0) {  // mostly the first character decides
                 return next[1];
+            }
+        }
         return nullptr;
     }
 

@@ -22,26 +22,30 @@ std::string DescribeType(TCIMValue::TCIMType type)
 boost::shared_ptr<TInMemClass> TCimXmlClassMaker::Make(const TCimXmlDraft& draft, const boost::shared_ptr<TInMemClass>& super)
 {
     const TEmbeddedObject& object = draft.object;
-    if (super && super->CountSuperClasses() >= TSchemaLimits::kMaxSuperClasses)
+    if (super && super->CountSuperClasses() >= TSchemaLimits::kMaxSuperClasses) {
         fContext.Fail(EStatus::kParseError, "found class " + TCimXmlContext::Quote(object.GetClassName()) + " below more than " +
                                                 std::to_string(TSchemaLimits::kMaxSuperClasses) +
                                                 " superclasses; flatten the class tree");
+    }
     fContext.CheckName("class", object.GetClassName());
     const boost::shared_ptr<TInMemClass> cls = fNamespace.AllocateInMemClass(object.GetClassName(), super);
     AddQualifiers(*cls, object.GetQualifiers(), super ? &super->GetQualifiers() : nullptr);
     for (std::size_t index = 0; index < object.GetProperties().size(); ++index) {
         const TCimXmlContext::TAt at(fContext, draft.propertyPlaces[index]);
         AddProperty(*cls, object.GetProperties()[index], super.get());
-        if (cls->GetSlotOrder().size() > TSchemaLimits::kMaxProperties)
+        if (cls->GetSlotOrder().size() > TSchemaLimits::kMaxProperties) {
             FailTooMany(TSchemaLimits::kMaxProperties, "properties", object.GetClassName());
+        }
     }
     std::size_t methods = 0;
-    for (const TInMemClass* above = super.get(); above != nullptr; above = above->GetSuperInMemClass().get())
+    for (const TInMemClass* above = super.get(); above != nullptr; above = above->GetSuperInMemClass().get()) {
         methods += above->GetOwnMethodDecls().size();
+    }
     for (const TEmbeddedObject::TMethod& method : object.GetMethods()) {
         AddMethod(*cls, method, super.get());
-        if (methods + cls->GetOwnMethodDecls().size() > TSchemaLimits::kMaxMethods)
+        if (methods + cls->GetOwnMethodDecls().size() > TSchemaLimits::kMaxMethods) {
             FailTooMany(TSchemaLimits::kMaxMethods, "methods", object.GetClassName());
+        }
     }
     return cls;
 }
@@ -58,27 +62,31 @@ void TCimXmlClassMaker::AddProperty(TInMemClass& cls, const TEmbeddedObject::TPr
     const TCIMValue::TCIMType type = property.fValue.GetType();
     const boost::shared_ptr<TInMemPropertyDecl> inherited =
         super != nullptr ? super->FindPropertyDecl(property.fName) : boost::shared_ptr<TInMemPropertyDecl>();
-    if (inherited && inherited->GetType() != type)
+    if (inherited && inherited->GetType() != type) {
         fContext.Fail(EStatus::kTypeMismatch, "found property " + TCimXmlContext::Quote(property.fName) + " of type " +
                                                   DescribeType(type) + " in class " + TCimXmlContext::Quote(cls.GetName()) +
                                                   ", but a superclass declares it as " + DescribeType(inherited->GetType()));
-    if (inherited && property.fPropagated)
+    }
+    if (inherited && property.fPropagated) {
         return;
+    }
     const auto decl = boost::make_shared<TInMemPropertyDecl>(property.fName, property.fValue);
     decl->SetReferenceClass(property.fReferenceClass);
     decl->SetArraySize(property.fArraySize);
     AddQualifiers(*decl, property.fQualifiers, inherited ? &inherited->GetQualifiers() : nullptr);
-    if (!cls.AddPropertyDecl(decl))
+    if (!cls.AddPropertyDecl(decl)) {
         fContext.Fail(EStatus::kParseError, "found a second declaration of property " + TCimXmlContext::Quote(property.fName) +
                                                 " in class " + TCimXmlContext::Quote(cls.GetName()));
+    }
 }
 
 void TCimXmlClassMaker::AddMethod(TInMemClass& cls, const TEmbeddedObject::TMethod& method, const TInMemClass* super)
 {
     const boost::shared_ptr<TInMemMethodDecl> inherited =
         super != nullptr ? super->FindMethodDecl(method.fName) : boost::shared_ptr<TInMemMethodDecl>();
-    if (inherited && method.fPropagated)
+    if (inherited && method.fPropagated) {
         return;
+    }
     const auto decl = boost::make_shared<TInMemMethodDecl>(method.fName, method.fType);
     for (const TEmbeddedObject::TParameter& parameter : method.fParameters) {
         const auto made = boost::make_shared<TInMemParameter>(parameter.fName, parameter.fType);
@@ -88,23 +96,27 @@ void TCimXmlClassMaker::AddMethod(TInMemClass& cls, const TEmbeddedObject::TMeth
         decl->AddParameter(made);
     }
     AddQualifiers(*decl, method.fQualifiers, inherited ? &inherited->GetQualifiers() : nullptr);
-    if (!cls.AddMethodDecl(decl))
+    if (!cls.AddMethodDecl(decl)) {
         fContext.Fail(EStatus::kParseError, "found a second declaration of method " + TCimXmlContext::Quote(method.fName) +
                                                 " in class " + TCimXmlContext::Quote(cls.GetName()));
+    }
 }
 
 template <class TElement>
 void TCimXmlClassMaker::AddQualifiers(TElement& element, const TQualifiers& qualifiers, const TInMemQualifierSet* inherited)
 {
-    if (qualifiers.size() + (inherited != nullptr ? inherited->CountAll() : 0) > TSchemaLimits::kMaxQualifiers)
+    if (qualifiers.size() + (inherited != nullptr ? inherited->CountAll() : 0) > TSchemaLimits::kMaxQualifiers) {
         fContext.Fail(EStatus::kParseError, "found more than " + std::to_string(TSchemaLimits::kMaxQualifiers) +
                                                 " qualifiers on one element, inherited ones included; leave some out");
+    }
     for (const TEmbeddedObject::TQualifier& qualifier : qualifiers) {
         boost::shared_ptr<ICIMQualifier> above;
-        if (inherited != nullptr)
+        if (inherited != nullptr) {
             above = inherited->Find(qualifier.fName);
-        if (above && qualifier.fPropagated)
+        }
+        if (above && qualifier.fPropagated) {
             continue;
+        }
         NoteQualifier(qualifier, above.get());
         element.AddQualifier(boost::make_shared<TInMemQualifier>(qualifier.fName, qualifier.fValue, qualifier.fFlavor));
     }
@@ -113,13 +125,15 @@ void TCimXmlClassMaker::AddQualifiers(TElement& element, const TQualifiers& qual
 /// Notes what is odd about a qualifier: real servers and published schemas have both kinds.
 void TCimXmlClassMaker::NoteQualifier(const TEmbeddedObject::TQualifier& qualifier, const ICIMQualifier* inherited)
 {
-    if (!fNamespace.FindQualifierDecl(qualifier.fName))
+    if (!fNamespace.FindQualifierDecl(qualifier.fName)) {
         fContext.Tolerate("undeclared qualifier",
                           "qualifier " + TCimXmlContext::Quote(qualifier.fName) + " is not declared; taken as it is written");
-    if (inherited != nullptr && inherited->GetFlavor(TCallContext()) != qualifier.fFlavor)
+    }
+    if (inherited != nullptr && inherited->GetFlavor(TCallContext()) != qualifier.fFlavor) {
         fContext.Tolerate("other flavor",
                           "qualifier " + TCimXmlContext::Quote(qualifier.fName) +
                               " is restated with another flavor than the superclass gives it; taken as it is written");
+    }
 }
 
 }  // namespace NORVZEL20

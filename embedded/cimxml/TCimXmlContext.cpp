@@ -36,20 +36,24 @@ void TCimXmlContext::NoteNamespace(const std::string& name, const std::string& h
         fReport.namesNamespace = true;
         fReport.namespaceName = name;
     }
-    if (!TNameText::Equal(name, fReport.namespaceName))
+    if (!TNameText::Equal(name, fReport.namespaceName)) {
         Fail(TZELStatusCode::kParseError, "found namespace " + Quote(name) + " after " + Quote(fReport.namespaceName) +
                                               "; one document is one namespace, split this one");
-    if (fReport.host.empty())
+    }
+    if (fReport.host.empty()) {
         fReport.host = host;
-    if (!host.empty() && !TNameText::Equal(host, fReport.host))
+    }
+    if (!host.empty() && !TNameText::Equal(host, fReport.host)) {
         Fail(TZELStatusCode::kParseError,
              "found host " + Quote(host) + " after " + Quote(fReport.host) + "; one document is one host's, split this one");
+    }
 }
 
 bool TCimXmlContext::IsOwn(const std::string& name, const std::string& host) const
 {
-    if (!TNameText::Equal(name, fReport.namespaceName))
+    if (!TNameText::Equal(name, fReport.namespaceName)) {
         return false;
+    }
     return host.empty() || fReport.host.empty() || TNameText::Equal(host, fReport.host);
 }
 
@@ -59,21 +63,25 @@ void TCimXmlContext::CheckName(const char* what, std::string_view name) const
         const char lower = TNameText::ToLower(c);
         return (lower >= 'a' && lower <= 'z') || (c >= '0' && c <= '9') || c == '_' || static_cast<unsigned char>(c) >= 0x80;
     };
-    if (!std::all_of(name.begin(), name.end(), isPart))
+    if (!std::all_of(name.begin(), name.end(), isPart)) {
         Fail(TZELStatusCode::kParseError,
              std::string("found ") + what + " " + Quote(name) + ", expected a name of letters, digits and underscores");
+    }
 }
 
 std::string TCimXmlContext::Quote(std::string_view text)
 {
     constexpr std::size_t kLongest = 80;
     std::string quoted = "\"";
-    for (const char c : text.substr(0, kLongest))
+    for (const char c : text.substr(0, kLongest)) {
         quoted += static_cast<unsigned char>(c) < ' ' ? '.' : c;
-    while (text.size() > kLongest && (static_cast<unsigned char>(quoted.back()) & 0xC0) == 0x80)
+    }
+    while (text.size() > kLongest && (static_cast<unsigned char>(quoted.back()) & 0xC0) == 0x80) {
         quoted.pop_back();  // not in the middle of a character: first its continuation bytes ...
-    if (text.size() > kLongest && static_cast<unsigned char>(quoted.back()) >= 0xC0)
+    }
+    if (text.size() > kLongest && static_cast<unsigned char>(quoted.back()) >= 0xC0) {
         quoted.pop_back();  // ... then its first one
+    }
     return quoted + (text.size() > kLongest ? "...\"" : "\"");
 }
 

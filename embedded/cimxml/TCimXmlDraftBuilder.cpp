@@ -30,18 +30,20 @@ TCimXmlDraft TCimXmlDraftBuilder::Take()
 /// Fails where there are as many as there may be.
 void TCimXmlDraftBuilder::CheckRoom(std::size_t count, std::size_t most, const char* what) const
 {
-    if (count >= most)
+    if (count >= most) {
         fContext.Fail(EStatus::kParseError, "found more than " + std::to_string(most) + " " + what + " in " +
                                                 (fDraft->object.IsClass() ? "class " : "an instance of class ") +
                                                 TCimXmlContext::Quote(fDraft->object.GetClassName()) + "; split it");
+    }
 }
 
 void TCimXmlDraftBuilder::BeginProperty(const char* name, const TCimXmlAttributes& attributes)
 {
     CheckRoom(fDraft->object.GetProperties().size(), TSchemaLimits::kMaxProperties, "properties");
-    if (fDraft->object.FindProperty(name) != nullptr)
+    if (fDraft->object.FindProperty(name) != nullptr) {
         fContext.Fail(EStatus::kParseError, "found property " + TCimXmlContext::Quote(name) + " a second time in one " +
                                                 (fDraft->object.IsClass() ? "class" : "instance"));
+    }
     fPropertyPlace = fContext.GetPlace();
     fProperty.emplace();
     fProperty->fName = name;
@@ -97,38 +99,45 @@ void TCimXmlDraftBuilder::AddQualifier(TEmbeddedObject::TQualifier qualifier)
                         : fProperty ? fProperty->fQualifiers
                                     : fDraft->object.GetQualifiers();
     CheckRoom(there.size(), TSchemaLimits::kMaxQualifiers, "qualifiers on one element");
-    if (fParameter)
+    if (fParameter) {
         fParameter->fQualifiers.push_back(std::move(qualifier));
-    else if (fMethod)
+    } else if (fMethod) {
         fMethod->fQualifiers.push_back(std::move(qualifier));
-    else if (fProperty)
+    } else if (fProperty) {
         fProperty->fQualifiers.push_back(std::move(qualifier));
-    else
+    } else {
         fDraft->object.AddQualifier(std::move(qualifier));
+    }
 }
 
 ICIMQualifierDecl::EFlavor TCimXmlDraftBuilder::ReadFlavor(const TCimXmlAttributes& attributes)
 {
     unsigned int flavor = ICIMQualifierDecl::kFlavorNone;
-    if (attributes.IsTrue("OVERRIDABLE", true))
+    if (attributes.IsTrue("OVERRIDABLE", true)) {
         flavor |= ICIMQualifierDecl::kFlavorOverridable;
-    if (attributes.IsTrue("TOSUBCLASS", true))
+    }
+    if (attributes.IsTrue("TOSUBCLASS", true)) {
         flavor |= ICIMQualifierDecl::kFlavorToSubclass;
-    if (attributes.IsTrue("TOINSTANCE", false))
+    }
+    if (attributes.IsTrue("TOINSTANCE", false)) {
         flavor |= ICIMQualifierDecl::kFlavorToInstance;
-    if (attributes.IsTrue("TRANSLATABLE", false))
+    }
+    if (attributes.IsTrue("TRANSLATABLE", false)) {
         flavor |= ICIMQualifierDecl::kFlavorTranslatable;
+    }
     return ICIMQualifierDecl::EFlavor(flavor);
 }
 
 unsigned int TCimXmlDraftBuilder::ReadArraySize(const TCimXmlAttributes& attributes) const
 {
     const char* text = attributes.Find("ARRAYSIZE");
-    if (text == nullptr)
+    if (text == nullptr) {
         return 0;
+    }
     TCIMValue size;
-    if (!TValueText::Parse(TCIMValue::TCIMType::kUint32, text, size))
+    if (!TValueText::Parse(TCIMValue::TCIMType::kUint32, text, size)) {
         fContext.Fail(EStatus::kParseError, "found the array size " + TCimXmlContext::Quote(text) + ", expected a number");
+    }
     return static_cast<unsigned int>(size.GetUnsigned());
 }
 

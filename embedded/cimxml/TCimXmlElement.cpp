@@ -87,8 +87,9 @@ constexpr std::array<unsigned char, kBuckets> MakeBuckets()
     std::array<unsigned char, kBuckets> buckets{};
     for (unsigned char element = 1; element < E::kCount; ++element) {
         std::size_t bucket = GetBucket(kNames[element]);
-        while (buckets[bucket] != E::kUnknown)
+        while (buckets[bucket] != E::kUnknown) {
             bucket = (bucket + 1) % kBuckets;
+        }
         buckets[bucket] = element;
     }
     return buckets;
@@ -101,9 +102,11 @@ constexpr std::array<unsigned char, kBuckets> kElements = MakeBuckets();
 TCimXmlElement::EElement TCimXmlElement::Find(const char* name) noexcept
 {
     const std::string_view text(name, std::strlen(name));
-    for (std::size_t bucket = GetBucket(text); kElements[bucket] != kUnknown; bucket = (bucket + 1) % kBuckets)
-        if (kNames[kElements[bucket]] == text)
+    for (std::size_t bucket = GetBucket(text); kElements[bucket] != kUnknown; bucket = (bucket + 1) % kBuckets) {
+        if (kNames[kElements[bucket]] == text) {
             return EElement(kElements[bucket]);
+        }
+    }
     return kUnknown;
 }
 

@@ -22,8 +22,9 @@ std::string Quote(std::string_view text)
 /// Whether text in the property is an embedded object: what its qualifiers say, for documents that do not mark the value.
 bool HoldsObjects(const TInMemPropertyDecl& decl)
 {
-    if (decl.GetType().GetElementType() != TCIMValue::TCIMType::kString)
+    if (decl.GetType().GetElementType() != TCIMValue::TCIMType::kString) {
         return false;
+    }
     return decl.GetQualifiers().IsTrue("EmbeddedObject") || decl.GetQualifiers().Find("EmbeddedInstance");
 }
 
@@ -41,9 +42,10 @@ void TCimXmlLoader::AddQualifierDecl(const TCimXmlQualifierDraft& draft)
         ++fContext.GetReport().qualifierDecls;
         return;
     }
-    if (known->GetValue().GetType() != draft.value.GetType() || known->GetValue() != draft.value)
+    if (known->GetValue().GetType() != draft.value.GetType() || known->GetValue() != draft.value) {
         fContext.Fail(EStatus::kAlreadyExists, "found a second declaration of qualifier " + Quote(draft.name) +
                                                    " that differs from the first in type or value; remove one");
+    }
     fContext.Tolerate("repeated qualifier", "qualifier " + Quote(draft.name) + " is declared again; the first declaration stands");
 }
 
@@ -52,15 +54,17 @@ void TCimXmlLoader::AddClass(TCimXmlDraft draft)
     const std::string& name = draft.object.GetClassName();
     const auto repeated = fClassNumbers.find(name);
     if (repeated != fClassNumbers.end()) {
-        if (fClasses[repeated->second].draft.object != draft.object)
+        if (fClasses[repeated->second].draft.object != draft.object) {
             fContext.Fail(EStatus::kAlreadyExists,
                           "found a second, different declaration of class " + Quote(name) + "; remove one");
+        }
         return fContext.Tolerate("repeated class", "class " + Quote(name) + " is declared again; the first declaration stands");
     }
     if (const boost::shared_ptr<TInMemClass> known = fNamespace->FindClass(name)) {
-        if (TCimXmlObjects::FromClass(*known) != TCimXmlObjects::WithoutInherited(draft.object))
+        if (TCimXmlObjects::FromClass(*known) != TCimXmlObjects::WithoutInherited(draft.object)) {
             fContext.Fail(EStatus::kAlreadyExists,
                           "found class " + Quote(name) + ", which the namespace declares differently; load into an empty one");
+        }
         return fContext.Tolerate("known class", "class " + Quote(name) + " is in the namespace already, declared the same");
     }
     fClassNumbers.emplace(name, fClasses.size());
@@ -71,21 +75,24 @@ void TCimXmlLoader::AddClass(TCimXmlDraft draft)
 /// Declares the classes that are new; those that are stuck wait until they are needed or the document ends.
 void TCimXmlLoader::DeclareClasses()
 {
-    for (; fFirstNew < fClasses.size(); ++fFirstNew)
+    for (; fFirstNew < fClasses.size(); ++fFirstNew) {
         DeclareClass(fFirstNew);
+    }
 }
 
 /// Tries again to declare a class whose superclass may have come meanwhile.
 void TCimXmlLoader::DeclareStuck(const char* className)
 {
     const auto known = fClassNumbers.find(className);
-    if (known == fClassNumbers.end())
+    if (known == fClassNumbers.end()) {
         return;
+    }
     for (std::size_t next = known->second; fClasses[next].state == TClassDraft::kStuck;) {
         fClasses[next].state = TClassDraft::kNew;
         const auto super = fClassNumbers.find(fClasses[next].draft.object.GetSuperClassName());
-        if (super != fClassNumbers.end())
+        if (super != fClassNumbers.end()) {
             next = super->second;
+        }
     }
     DeclareClass(known->second);
 }
@@ -101,8 +108,9 @@ std::vector<std::size_t> TCimXmlLoader::CollectChain(std::size_t number, boost::
         const std::string& superName = fClasses[next].draft.object.GetSuperClassName();
         super = fNamespace->FindClass(superName);
         const auto waiting = fClassNumbers.find(superName);
-        if (superName.empty() || super || waiting == fClassNumbers.end())
+        if (superName.empty() || super || waiting == fClassNumbers.end()) {
             break;
+        }
         next = waiting->second;
     }
     return chain;
@@ -116,8 +124,9 @@ void TCimXmlLoader::DeclareClass(std::size_t number)
     for (std::vector<std::size_t> chain = CollectChain(number, super); !chain.empty(); chain.pop_back()) {
         TClassDraft& waiting = fClasses[chain.back()];
         waiting.state = TClassDraft::kStuck;
-        if (!super && !waiting.draft.object.GetSuperClassName().empty())
+        if (!super && !waiting.draft.object.GetSuperClassName().empty()) {
             continue;
+        }
         const TCimXmlContext::TAt at(fContext, waiting.draft.place);
         fContext.Guard([&] {
             super = TCimXmlClassMaker(fContext, *fNamespace).Make(waiting.draft, super);
@@ -130,11 +139,13 @@ void TCimXmlLoader::DeclareClass(std::size_t number)
 
 TCimXmlLoader::TLayout* TCimXmlLoader::FindLayout(const char* className)
 {
-    if (fLayout != nullptr && fLayout->cls->GetName() == className)
+    if (fLayout != nullptr && fLayout->cls->GetName() == className) {
         return fLayout;
+    }
     const auto known = fLayouts.find(className);
-    if (known != fLayouts.end())
+    if (known != fLayouts.end()) {
         return known->second.get();
+    }
     boost::shared_ptr<TInMemClass> cls = fNamespace->FindClass(className);
     if (!cls) {
         DeclareClasses();
@@ -151,11 +162,13 @@ TCimXmlLoader::TLayout* TCimXmlLoader::AddLayout(const char* className, const bo
     layout->cls = cls;
     layout->positions.resize(cls->GetSlotCount());
     layout->given.resize(cls->GetSlotCount());
-    for (std::uint32_t slot = 0; slot < cls->GetSlotCount(); ++slot)
+    for (std::uint32_t slot = 0; slot < cls->GetSlotCount(); ++slot) {
         layout->embedded.push_back(HoldsObjects(cls->GetSlotDecl(slot)));
+    }
     const std::vector<std::uint32_t>& order = cls->GetSlotOrder();
-    for (std::uint32_t position = 0; position < order.size(); ++position)
+    for (std::uint32_t position = 0; position < order.size(); ++position) {
         layout->positions[order[position]] = position;
+    }
     return fLayouts.emplace(className, std::move(layout)).first->second.get();
 }
 
@@ -185,15 +198,18 @@ TCimXmlLoader::TTarget TCimXmlLoader::FindProperty(const char* name)
     const TInMemClass& cls = *fLayout->cls;
     const std::vector<std::uint32_t>& order = cls.GetSlotOrder();
     std::uint32_t slot = TInMemClass::kNoSlot;
-    if (fExpected < order.size() && cls.GetSlotDecl(order[fExpected]).GetName() == name)
+    if (fExpected < order.size() && cls.GetSlotDecl(order[fExpected]).GetName() == name) {
         slot = order[fExpected];
-    else
+    } else {
         slot = cls.FindSlot(name);
-    if (slot == TInMemClass::kNoSlot)
+    }
+    if (slot == TInMemClass::kNoSlot) {
         fContext.Fail(EStatus::kNotFound, "found property " + Quote(name) + ", but class " + Quote(cls.GetName()) +
                                               " declares none of that name; add its declaration or correct the name");
-    if (fLayout->given[slot] == fNumber)
+    }
+    if (fLayout->given[slot] == fNumber) {
         fContext.Fail(EStatus::kParseError, "found property " + Quote(name) + " a second time in one instance");
+    }
     fLayout->given[slot] = fNumber;
     fExpected = fLayout->positions[slot] + 1;
     const TInMemPropertyDecl& decl = cls.GetSlotDecl(slot);
@@ -202,11 +218,13 @@ TCimXmlLoader::TTarget TCimXmlLoader::FindProperty(const char* name)
 
 void TCimXmlLoader::SetProperty(const TTarget& target, TCIMValue&& value, bool metUnknownClass)
 {
-    if (value.GetType() != target.type)
+    if (value.GetType() != target.type) {
         value = Convert(target, value);
+    }
     fInstance->SetSlot(target.slot, std::move(value));
-    if (!metUnknownClass)
+    if (!metUnknownClass) {
         return;
+    }
     fUnresolved.emplace_back(fInstance, target.slot);
     fMustHold = fMustHold || fLayout->cls->GetSlotDecl(target.slot).IsKey();
 }
@@ -218,10 +236,11 @@ TCIMValue TCimXmlLoader::Convert(const TTarget& target, const TCIMValue& value)
         return std::string(TValueText::GetTypeName(type)) + (type.IsArray() ? "[]" : "");
     };
     TCIMValue converted;
-    if (!TValueText::Convert(value, target.type, converted))
+    if (!TValueText::Convert(value, target.type, converted)) {
         fContext.Fail(EStatus::kTypeMismatch, "found " + Quote(value.ToText()) + " of type " + describe(value.GetType()) +
                                                   " in property " + Quote(decl.GetName()) + ", which class " +
                                                   Quote(fLayout->cls->GetName()) + " declares as " + describe(target.type));
+    }
     fContext.Tolerate("other type", "property " + Quote(decl.GetName()) + " of class " + Quote(fLayout->cls->GetName()) +
                                         " is written as " + describe(value.GetType()) + "; taken as the declared " +
                                         describe(target.type));
@@ -230,16 +249,19 @@ TCIMValue TCimXmlLoader::Convert(const TTarget& target, const TCIMValue& value)
 
 void TCimXmlLoader::EndInstance(const TOwnKeys* ownKeys)
 {
-    if (ownKeys != nullptr && fInstance->FindMissingKey() != nullptr)
+    if (ownKeys != nullptr && fInstance->FindMissingKey() != nullptr) {
         FillKeys(*ownKeys);
+    }
     fLayout->isHeld = !fEnded && (fLayout->isHeld || fMustHold);
-    if (fLayout->isHeld)
+    if (fLayout->isHeld) {
         fHeld.push_back({fInstance, fContext.GetPlace()});
-    else
+    } else {
         Add(fInstance);
+    }
     ++fContext.GetReport().instances;
-    if (fKeep)
+    if (fKeep) {
         fKeptInstances.push_back(fInstance);
+    }
     fInstance.reset();
 }
 
@@ -257,8 +279,9 @@ void TCimXmlLoader::FillKeys(const TOwnKeys& keys)
 {
     for (const auto& [name, value] : keys) {
         const std::uint32_t slot = fLayout->cls->FindSlot(name);
-        if (slot == TInMemClass::kNoSlot || fLayout->given[slot] == fNumber)
+        if (slot == TInMemClass::kNoSlot || fLayout->given[slot] == fNumber) {
             continue;
+        }
         const TInMemPropertyDecl& decl = fLayout->cls->GetSlotDecl(slot);
         TCIMValue converted = value;
         TValueText::Convert(value, decl.GetType(), converted);  // where it cannot be, setting it says so
@@ -280,9 +303,10 @@ void TCimXmlLoader::Explain(const TZELException& error, const TInMemInstance& in
         fContext.Fail(status, "found a second instance " + (path.size() > kLongestPath ? Quote(path) : path) + "; instances" +
                                   ofClass + " must differ in their keys");
     }
-    if (status == EStatus::kKeyMissing)
+    if (status == EStatus::kKeyMissing) {
         fContext.Fail(status, "found an instance" + ofClass + " without a value for its key " + Quote(*instance.FindMissingKey()) +
                                   "; every key needs one");
+    }
     fContext.Fail(status, "found an instance" + ofClass + " that cannot be added: " + error.what());
 }
 
@@ -304,9 +328,10 @@ void TCimXmlLoader::AddWaiting(const TCimXmlDraft& draft, const TReadObjects& re
     const TCimXmlContext::TAt at(fContext, draft.place);
     const TEmbeddedObject& object = draft.object;
     TLayout* layout = FindLayout(object.GetClassName().c_str());
-    if (layout == nullptr)
+    if (layout == nullptr) {
         fContext.Fail(EStatus::kNotFound, "found an instance of class " + Quote(object.GetClassName()) +
                                               ", which is not declared; add its <CLASS> to the document or load it before");
+    }
     BeginInstance(*layout);
     const TReferenceAdapter adapter(*fNamespace);
     for (std::size_t index = 0; index < object.GetProperties().size(); ++index) {
@@ -323,19 +348,25 @@ void TCimXmlLoader::AddWaiting(const TCimXmlDraft& draft, const TReadObjects& re
 void TCimXmlLoader::Finish(const TReadObjects& readObjects)
 {
     fEnded = true;
-    for (TClassDraft& cls : fClasses)
-        if (cls.state == TClassDraft::kStuck)
+    for (TClassDraft& cls : fClasses) {
+        if (cls.state == TClassDraft::kStuck) {
             cls.state = TClassDraft::kNew;
+        }
+    }
     fFirstNew = 0;
     DeclareClasses();
-    for (const TClassDraft& cls : fClasses)
-        if (cls.state != TClassDraft::kDeclared)
+    for (const TClassDraft& cls : fClasses) {
+        if (cls.state != TClassDraft::kDeclared) {
             RefuseClass(cls.draft);
-    if (fDeclaredLate)
+        }
+    }
+    if (fDeclaredLate) {
         ResolveReferences();
+    }
     AddHeld();
-    for (const TCimXmlDraft& draft : std::exchange(fWaiting, {}))
+    for (const TCimXmlDraft& draft : std::exchange(fWaiting, {})) {
         AddWaiting(draft, readObjects);
+    }
 }
 
 void TCimXmlLoader::RefuseClass(const TCimXmlDraft& draft) const
@@ -343,8 +374,9 @@ void TCimXmlLoader::RefuseClass(const TCimXmlDraft& draft) const
     const TCimXmlContext::TAt at(fContext, draft.place);
     const std::string found =
         "found class " + Quote(draft.object.GetClassName()) + " with the superclass " + Quote(draft.object.GetSuperClassName());
-    if (fClassNumbers.count(draft.object.GetSuperClassName()) > 0)
+    if (fClassNumbers.count(draft.object.GetSuperClassName()) > 0) {
         fContext.Fail(EStatus::kNotFound, found + ", which in the end is below it or below an undeclared class");
+    }
     fContext.Fail(EStatus::kNotFound, found + ", which is not declared; add its <CLASS> to the document or load it before");
 }
 
@@ -354,18 +386,21 @@ void TCimXmlLoader::ResolveReferences()
     const TReferenceAdapter adapter(*fNamespace);
     for (const auto& [instance, slot] : std::exchange(fUnresolved, {})) {
         TCIMValue value = instance->GetSlotValue(slot);
-        if (adapter.Adapt(value))
+        if (adapter.Adapt(value)) {
             instance->SetSlot(slot, std::move(value));
+        }
     }
 }
 
 std::vector<boost::shared_ptr<ICIMElement>> TCimXmlLoader::TakeElements()
 {
     std::vector<boost::shared_ptr<ICIMElement>> elements;
-    if (!fKeep)
+    if (!fKeep) {
         return elements;
-    for (const TClassDraft& cls : fClasses)
+    }
+    for (const TClassDraft& cls : fClasses) {
         elements.push_back(fNamespace->FindClass(cls.draft.object.GetClassName()));
+    }
     elements.insert(elements.end(), fKeptInstances.begin(), fKeptInstances.end());
     return elements;
 }

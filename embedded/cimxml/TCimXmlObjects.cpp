@@ -22,8 +22,9 @@ TQualifiers FromQualifiers(const TElement& element, const TInMemory* inMemory)
 {
     TQualifiers qualifiers;
     if (inMemory != nullptr) {
-        for (const boost::shared_ptr<ICIMQualifier>& qualifier : inMemory->GetQualifiers().GetOwn())
+        for (const boost::shared_ptr<ICIMQualifier>& qualifier : inMemory->GetQualifiers().GetOwn()) {
             qualifiers.push_back(FromQualifier(*qualifier));
+        }
         return qualifiers;
     }
     const auto add = [&](const boost::shared_ptr<ICIMQualifier>& qualifier) {
@@ -55,20 +56,24 @@ TEmbeddedObject::TMethod FromMethodDecl(const ICIMMethodDecl& decl)
     method.fType = decl.GetType(TCallContext());
     const auto* inMemory = dynamic_cast<const TInMemMethodDecl*>(&decl);
     method.fQualifiers = FromQualifiers(decl, inMemory);
-    if (inMemory == nullptr)
+    if (inMemory == nullptr) {
         return method;
-    for (const boost::shared_ptr<TInMemParameter>& parameter : inMemory->GetParameters())
+    }
+    for (const boost::shared_ptr<TInMemParameter>& parameter : inMemory->GetParameters()) {
         method.fParameters.push_back({parameter->GetName(), parameter->GetType(), parameter->GetReferenceClass(),
                                       parameter->GetArraySize(), FromQualifiers(*parameter, parameter.get())});
+    }
     return method;
 }
 
 void AddOwnElements(TEmbeddedObject& object, const TInMemClass& cls)
 {
-    for (const boost::shared_ptr<TInMemPropertyDecl>& decl : cls.GetOwnPropertyDecls())
+    for (const boost::shared_ptr<TInMemPropertyDecl>& decl : cls.GetOwnPropertyDecls()) {
         object.AddProperty(FromPropertyDecl(*decl));
-    for (const boost::shared_ptr<TInMemMethodDecl>& decl : cls.GetOwnMethodDecls())
+    }
+    for (const boost::shared_ptr<TInMemMethodDecl>& decl : cls.GetOwnMethodDecls()) {
         object.AddMethod(FromMethodDecl(*decl));
+    }
 }
 
 void AddAllElements(TEmbeddedObject& object, const ICIMClass& cls)
@@ -90,12 +95,16 @@ template <class TElement>
 std::vector<TElement> OwnOf(const std::vector<TElement>& elements)
 {
     std::vector<TElement> own;
-    for (const TElement& element : elements)
-        if (!element.fPropagated)
+    for (const TElement& element : elements) {
+        if (!element.fPropagated) {
             own.push_back(element);
-    if constexpr (!std::is_same_v<TElement, TEmbeddedObject::TQualifier>)
-        for (TElement& element : own)
+        }
+    }
+    if constexpr (!std::is_same_v<TElement, TEmbeddedObject::TQualifier>) {
+        for (TElement& element : own) {
             element.fQualifiers = OwnOf(element.fQualifiers);
+        }
+    }
     return own;
 }
 
@@ -105,27 +114,33 @@ TEmbeddedObject TCimXmlObjects::WithoutInherited(const TEmbeddedObject& cls)
 {
     TEmbeddedObject object(cls.GetClassName(), true);
     object.SetSuperClassName(cls.GetSuperClassName());
-    for (TEmbeddedObject::TQualifier& qualifier : OwnOf(cls.GetQualifiers()))
+    for (TEmbeddedObject::TQualifier& qualifier : OwnOf(cls.GetQualifiers())) {
         object.AddQualifier(std::move(qualifier));
-    for (TEmbeddedObject::TProperty& property : OwnOf(cls.GetProperties()))
+    }
+    for (TEmbeddedObject::TProperty& property : OwnOf(cls.GetProperties())) {
         object.AddProperty(std::move(property));
-    for (TEmbeddedObject::TMethod& method : OwnOf(cls.GetMethods()))
+    }
+    for (TEmbeddedObject::TMethod& method : OwnOf(cls.GetMethods())) {
         object.AddMethod(std::move(method));
+    }
     return object;
 }
 
 TEmbeddedObject TCimXmlObjects::FromClass(const ICIMClass& cls)
 {
     TEmbeddedObject object(cls.GetName(TCallContext()), true);
-    if (const boost::shared_ptr<ICIMClass> super = cls.GetSuperClass(TCallContext()))
+    if (const boost::shared_ptr<ICIMClass> super = cls.GetSuperClass(TCallContext())) {
         object.SetSuperClassName(super->GetName(TCallContext()));
+    }
     const auto* inMemory = dynamic_cast<const TInMemClass*>(&cls);
-    for (TEmbeddedObject::TQualifier& qualifier : FromQualifiers(cls, inMemory))
+    for (TEmbeddedObject::TQualifier& qualifier : FromQualifiers(cls, inMemory)) {
         object.AddQualifier(std::move(qualifier));
-    if (inMemory != nullptr)
+    }
+    if (inMemory != nullptr) {
         AddOwnElements(object, *inMemory);
-    else
+    } else {
         AddAllElements(object, cls);
+    }
     return object;
 }
 
@@ -139,8 +154,9 @@ TEmbeddedObject::TProperty TCimXmlObjects::FromProperty(const ICIMProperty& prop
         result.fReferenceClass = inMemory->GetReferenceClass();
         result.fArraySize = inMemory->GetArraySize();
     }
-    if (result.fValue.IsNull())
+    if (result.fValue.IsNull()) {
         result.fValue = TCIMValue::Null(decl->GetType(TCallContext()));
+    }
     return result;
 }
 

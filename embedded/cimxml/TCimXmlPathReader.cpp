@@ -32,10 +32,12 @@ TCimXmlPathReader::TCimXmlPathReader(TCimXmlContext& context, boost::shared_ptr<
 
 void TCimXmlPathReader::Begin()
 {
-    if (++fDepth > kMaxDepth)
+    if (++fDepth > kMaxDepth) {
         FailTooDeep();
-    if (fDepth > fFrames.size())
+    }
+    if (fDepth > fFrames.size()) {
         fFrames.emplace_back();
+    }
     TFrame& frame = fFrames[fDepth - 1];
     frame.namespaceName.clear();
     frame.host.clear();
@@ -48,8 +50,9 @@ void TCimXmlPathReader::Begin()
 TCIMReference TCimXmlPathReader::End()
 {
     const TFrame& frame = fFrames[--fDepth];
-    if (frame.className.empty())
+    if (frame.className.empty()) {
         fContext.Fail(EStatus::kParseError, "found an empty <VALUE.REFERENCE>, expected the name of a class or an instance in it");
+    }
     TCIMReference path;
     const boost::shared_ptr<TInMemClass> cls = FindClass(frame.className);
     if (cls) {
@@ -66,12 +69,14 @@ TCIMReference TCimXmlPathReader::End()
     for (const auto& [declared, value] : frame.keys) {
         std::string name = declared.empty() ? FindOnlyKey(cls.get()) : declared;
         TCIMValue adapted = value;
-        if (!cls || TReferenceAdapter::AdaptKey(*cls, name, adapted) == nullptr)
+        if (!cls || TReferenceAdapter::AdaptKey(*cls, name, adapted) == nullptr) {
             fContext.CheckName("key", name);
+        }
         AddKeyTo(path, name, adapted);
     }
-    if (path.GetKeyCount() < frame.keys.size())
+    if (path.GetKeyCount() < frame.keys.size()) {
         fContext.Fail(EStatus::kParseError, "found a key a second time in one path, expected each once");
+    }
     return path;
 }
 
@@ -93,27 +98,31 @@ void TCimXmlPathReader::FailTooDeep() const
 /// The key that a value without a name belongs to.
 const std::string& TCimXmlPathReader::FindOnlyKey(const TInMemClass* cls) const
 {
-    if (cls == nullptr || cls->GetKeySlots().size() != 1)
+    if (cls == nullptr || cls->GetKeySlots().size() != 1) {
         fContext.Fail(EStatus::kParseError, "found a key value without a name, expected it in a <KEYBINDING> that names the key"
                                             " (or a class with one key, declared in front of it)");
+    }
     return cls->GetSlotDecl(cls->GetKeySlots().front()).GetName();
 }
 
 boost::shared_ptr<TInMemClass> TCimXmlPathReader::FindClass(const std::string& name)
 {
-    if (!fNamespace || (fLastClass && fLastClass->GetName() == name))
+    if (!fNamespace || (fLastClass && fLastClass->GetName() == name)) {
         return fLastClass;
+    }
     boost::shared_ptr<TInMemClass> cls = fNamespace->FindClass(name);
-    if (cls)
+    if (cls) {
         fLastClass = cls;
+    }
     return cls;
 }
 
 void TCimXmlPathReader::NoteOwnNamespace()
 {
     const TFrame& frame = fFrames.front();
-    if (fDepth > 0 && !frame.namespaceName.empty())
+    if (fDepth > 0 && !frame.namespaceName.empty()) {
         fContext.NoteNamespace(frame.namespaceName, frame.host);
+    }
 }
 
 void TCimXmlPathReader::BeginNamespacePath()
@@ -124,17 +133,20 @@ void TCimXmlPathReader::BeginNamespacePath()
 
 void TCimXmlPathReader::AddNamespace(const char* name)
 {
-    if (!fNamespaceName.empty())
+    if (!fNamespaceName.empty()) {
         fNamespaceName += '/';
-    if (std::strpbrk(name, ":=\"") != nullptr)
+    }
+    if (std::strpbrk(name, ":=\"") != nullptr) {
         fContext.Fail(EStatus::kParseError, "found namespace " + TCimXmlContext::Quote(name) + ", expected a name without \":=");
+    }
     fNamespaceName += name;
 }
 
 void TCimXmlPathReader::SetHost(std::string_view host)
 {
-    if (!fHost.empty() || host.find('/') != std::string_view::npos)
+    if (!fHost.empty() || host.find('/') != std::string_view::npos) {
         fContext.Fail(EStatus::kParseError, "found host " + TCimXmlContext::Quote(host) + ", expected one, without a slash");
+    }
     fHost = host;
 }
 
@@ -144,16 +156,18 @@ void TCimXmlPathReader::EndNamespacePath()
         fContext.NoteNamespace(fNamespaceName, fHost);
         return;
     }
-    if (!fFrames[fDepth - 1].namespaceName.empty())
+    if (!fFrames[fDepth - 1].namespaceName.empty()) {
         fContext.Fail(EStatus::kParseError, "found a second namespace in one path, expected one");
+    }
     fFrames[fDepth - 1].namespaceName = fNamespaceName;
     fFrames[fDepth - 1].host = fHost;
 }
 
 void TCimXmlPathReader::SetClassName(const char* name)
 {
-    if (!fFrames[fDepth - 1].className.empty())
+    if (!fFrames[fDepth - 1].className.empty()) {
         fContext.Fail(EStatus::kParseError, "found a second path where one is expected");
+    }
     fFrames[fDepth - 1].className = name;
 }
 
@@ -166,10 +180,11 @@ void TCimXmlPathReader::BeginKeyBinding(const char* name)
 void TCimXmlPathReader::EndKeyBinding()
 {
     TFrame& frame = fFrames[fDepth - 1];
-    if (!frame.keyName.empty())
+    if (!frame.keyName.empty()) {
         fContext.Fail(EStatus::kParseError,
                       "found key " + TCimXmlContext::Quote(frame.keyName) +
                           " without a value, expected a <KEYVALUE> or a <VALUE.REFERENCE> in its <KEYBINDING>");
+    }
     frame.isInBinding = false;
 }
 
@@ -187,11 +202,13 @@ void TCimXmlPathReader::EndKeyValue(std::string_view text)
 void TCimXmlPathReader::AddKey(TCIMValue value)
 {
     TFrame& frame = fFrames[fDepth - 1];
-    if (frame.isInBinding && frame.keyName.empty())
+    if (frame.isInBinding && frame.keyName.empty()) {
         fContext.Fail(EStatus::kParseError, "found a second value in one <KEYBINDING>, expected one");
-    if (frame.keys.size() == TSchemaLimits::kMaxKeyBindings)
+    }
+    if (frame.keys.size() == TSchemaLimits::kMaxKeyBindings) {
         fContext.Fail(EStatus::kParseError,
                       "found more than " + std::to_string(TSchemaLimits::kMaxKeyBindings) + " key bindings in one path");
+    }
     frame.keys.emplace_back(frame.keyName, std::move(value));
     frame.keyName.clear();
 }
@@ -199,13 +216,15 @@ void TCimXmlPathReader::AddKey(TCIMValue value)
 TCIMValue TCimXmlPathReader::ReadKey(std::string_view text)
 {
     const TType type = TValueText::FindType(fType);
-    if ((type == TType::kNone && (fValueType.empty() || fValueType == "string")) || type == TType::kString)
+    if ((type == TType::kNone && (fValueType.empty() || fValueType == "string")) || type == TType::kString) {
         return fContext.GetTexts().MakeValue(text);
+    }
     TCIMValue value;
     if (type != TType::kNone      ? TValueText::Parse(type, text, value)
         : fValueType == "boolean" ? TValueText::Parse(TType::kBoolean, text, value)
-                                  : ReadNumber(text, value))
+                                  : ReadNumber(text, value)) {
         return value;
+    }
     const std::string expected = type != TType::kNone ? fType : fValueType == "boolean" ? "boolean" : "number";
     fContext.Fail(EStatus::kTypeMismatch,
                   "found " + TCimXmlContext::Quote(text) + " as the value of a key, expected a " + expected);

@@ -31,15 +31,17 @@ class TFileSource {
   public:
     explicit TFileSource(const std::string& path) : fPath(path), fFile(std::fopen(path.c_str(), "rb"))
     {
-        if (!fFile)
+        if (!fFile) {
             Fail("cannot open the file: ");
+        }
     }
 
     std::size_t operator()(char* buffer, std::size_t size)
     {
         const std::size_t length = std::fread(buffer, 1, size, fFile.get());
-        if (std::ferror(fFile.get()) != 0)
+        if (std::ferror(fFile.get()) != 0) {
             Fail("cannot read the file: ");
+        }
         return length;
     }
 
@@ -105,8 +107,9 @@ class TLoad {
         std::size_t length = 0;
         while (length < room) {
             const std::size_t more = source(buffer + length, room - length);
-            if (more == 0)
+            if (more == 0) {
                 break;
+            }
             length += more;
         }
         return length;
@@ -114,14 +117,16 @@ class TLoad {
 
     void RefuseEmpty(std::size_t length) const
     {
-        if (length == 0)
+        if (length == 0) {
             fContext.Fail(EStatus::kParseError, "found an empty document, expected CIM-XML");
+        }
     }
 
     void Check(bool succeeded) const
     {
-        if (!succeeded)
+        if (!succeeded) {
             fContext.Fail(EStatus::kParseError, "found malformed XML: " + fXml.GetError());
+        }
     }
 
     TCimXmlContext fContext;
@@ -138,12 +143,14 @@ template <class TRead>
 TLoadReport TCimXmlPopulator::Load(const std::string& name, TRead read)
 {
     const auto ns = boost::dynamic_pointer_cast<TInMemNamespace>(fNamespace);
-    if (!ns)
+    if (!ns) {
         throw TPopulateError(EStatus::kNotSupported, "the namespace is none of the provider \"inmem\", load into one of those",
                              name, 0, 0);
+    }
     TLoad load(ns, name);
-    if (fKeep)
+    if (fKeep) {
         load.GetLoader().KeepElements();
+    }
     read(load);
     load.Finish();
     fElements = load.GetLoader().TakeElements();

@@ -55,9 +55,10 @@ class TCimXmlReader::TEmbedded {
     {
         fSink.Reset();
         fXml.Reset("UTF-8");
-        if (!fXml.Parse(text.data(), text.size(), true))
+        if (!fXml.Parse(text.data(), text.size(), true)) {
             fContext.Fail(EStatus::kTypeMismatch,
                           "found " + Quote(text) + ", expected an <INSTANCE> or a <CLASS> (" + fXml.GetError() + ")");
+        }
         return fSink.TakeObject();
     }
 
@@ -94,8 +95,9 @@ void TCimXmlReader::OnStart(const char* name, const char** attributes)
     CheckBlank();
     const TElement::EElement element = TElement::Find(name);
     const TTable::TStep step = TTable::Find(GetState(), element);
-    if (step.action == TTable::kRefuse)
+    if (step.action == TTable::kRefuse) {
         FailUnexpected(name);
+    }
     fOpen.push_back({step.next, element});
     fText = std::string_view();
     fContext.Guard([&] { Begin(step.action, TCimXmlAttributes(attributes)); });
@@ -113,11 +115,13 @@ void TCimXmlReader::OnEnd(const char*)
 /// Text where only elements may stand must be white space.
 void TCimXmlReader::CheckBlank() const
 {
-    if (fText.empty() || TTable::TakesText(GetState()))
+    if (fText.empty() || TTable::TakesText(GetState())) {
         return;
-    if (!std::all_of(fText.begin(), fText.end(), IsBlank))
+    }
+    if (!std::all_of(fText.begin(), fText.end(), IsBlank)) {
         fContext.Fail(EStatus::kParseError, "found text " + Quote(fText) + " in <" + TElement::GetName(fOpen.back().element) +
                                                 ">, expected elements alone");
+    }
 }
 
 void TCimXmlReader::Begin(TTable::EAction action, const TCimXmlAttributes& attributes)
@@ -174,8 +178,9 @@ void TCimXmlReader::End(TTable::EAction action)
     case TTable::kEndHost:
         return fPaths.SetHost(fText);
     case TTable::kEndNamespacePath:
-        if (GetState() != TTable::kNamespacePath)  // there it ends with the host's part
+        if (GetState() != TTable::kNamespacePath) {  // there it ends with the host's part
             fPaths.EndNamespacePath();
+        }
         return;
     default:
         return EndDeclared(action);
@@ -190,18 +195,21 @@ void TCimXmlReader::BeginObject()
 
 void TCimXmlReader::EndObject()
 {
-    if (!fObjectGiven)
+    if (!fObjectGiven) {
         fContext.Fail(EStatus::kParseError, "found an object without contents, expected a <CLASS> or an <INSTANCE> in it");
+    }
     fPaths.Drop();
 }
 
 /// To be called where a class or an instance starts: an object holds one, and its name tells the namespace.
 void TCimXmlReader::NoteObject()
 {
-    if (fOpen[fOpen.size() - 2].state != TTable::kObject)
+    if (fOpen[fOpen.size() - 2].state != TTable::kObject) {
         return;
-    if (fObjectGiven)
+    }
+    if (fObjectGiven) {
         fContext.Fail(EStatus::kParseError, "found a second object where one is expected");
+    }
     fObjectGiven = true;
     fPaths.NoteOwnNamespace();
 }
@@ -211,8 +219,9 @@ void TCimXmlReader::BeginInstance(const TCimXmlAttributes& attributes)
     NoteObject();
     const char* name = Require(attributes, "CLASSNAME");
     fDirect = fLoader != nullptr && fLoader->BeginInstance(name);
-    if (!fDirect)
+    if (!fDirect) {
         fDraft.BeginInstance(name);
+    }
 }
 
 void TCimXmlReader::EndInstance()
@@ -228,8 +237,9 @@ void TCimXmlReader::EndInstance()
         fObject = boost::make_shared<const TEmbeddedObject>(std::move(draft.object));
         return;
     }
-    if (isNamed)
+    if (isNamed) {
         draft.ownKeys = fPaths.GetOwnKeys();
+    }
     fLoader->AddInstance(std::move(draft));
 }
 
@@ -245,27 +255,32 @@ void TCimXmlReader::BeginItem(TItem& item, std::string_view name, TType type)
 void TCimXmlReader::BeginProperty(const TCimXmlAttributes& attributes)
 {
     const char* name = Require(attributes, "NAME");
-    if (fDirect)
+    if (fDirect) {
         fTarget = fLoader->FindProperty(name);
-    else
+    } else {
         fDraft.BeginProperty(name, attributes);
+    }
     BeginItem(fProperty, fDirect ? *fTarget.name : fDraft.GetPropertyName(), ReadPropertyType(attributes));
-    if (fProperty.type.GetElementType() != TType::kString)
+    if (fProperty.type.GetElementType() != TType::kString) {
         return;
-    if (IsMarkedEmbedded(attributes))
+    }
+    if (IsMarkedEmbedded(attributes)) {
         fProperty.text = TItem::kObject;
-    else if (fDirect && fTarget.isEmbedded)
+    } else if (fDirect && fTarget.isEmbedded) {
         fProperty.text = TItem::kPerhapsObject;
+    }
 }
 
 /// The type that the element tells; looked up only where it is not the declared one.
 TType TCimXmlReader::ReadPropertyType(const TCimXmlAttributes& attributes) const
 {
     const TElement::EElement element = fOpen.back().element;
-    if (element == TElement::kPropertyReference)
+    if (element == TElement::kPropertyReference) {
         return TType::kReference;
-    if (element == TElement::kPropertyRefArray)
+    }
+    if (element == TElement::kPropertyRefArray) {
         return TType::kArrayReference;
+    }
     const char* text = Require(attributes, "TYPE");
     const bool isDeclared = fDirect && std::strcmp(text, TValueText::GetTypeName(fTarget.type)) == 0;
     const TType type = isDeclared ? fTarget.type.GetElementType() : ReadType(text);
@@ -274,19 +289,23 @@ TType TCimXmlReader::ReadPropertyType(const TCimXmlAttributes& attributes) const
 
 void TCimXmlReader::EndProperty()
 {
-    if (!fDirect)
+    if (!fDirect) {
         return fDraft.EndProperty(TakeValue(fProperty));
-    if (!fProperty.value.IsNull())
+    }
+    if (!fProperty.value.IsNull()) {
         fLoader->SetProperty(fTarget, std::move(fProperty.value), fPaths.TakeMetUnknownClass());
+    }
     fProperty.value = TCIMValue();
 }
 
 void TCimXmlReader::BeginValue()
 {
-    if (fOpen[fOpen.size() - 2].state == TTable::kArray)
+    if (fOpen[fOpen.size() - 2].state == TTable::kArray) {
         return;
-    if (fItem->isGiven)
+    }
+    if (fItem->isGiven) {
         fContext.Fail(EStatus::kParseError, "found a second value for " + Quote(fItem->name) + ", expected one");
+    }
     fItem->isGiven = true;
 }
 
@@ -294,16 +313,18 @@ void TCimXmlReader::BeginArray()
 {
     BeginValue();
     fElements.clear();
-    if (GetState() == TTable::kReferenceArray && fItem->type.GetElementType() != TType::kReference)
+    if (GetState() == TTable::kReferenceArray && fItem->type.GetElementType() != TType::kReference) {
         fContext.Fail(EStatus::kTypeMismatch, "found an array of references as value of " + Quote(fItem->name) + ", expected a " +
                                                   TValueText::GetTypeName(fItem->type) + "[]");
+    }
 }
 
 /// What a value belongs to is the innermost element that is open when it has ended.
 void TCimXmlReader::EndText()
 {
-    if (GetState() != TTable::kArray)
+    if (GetState() != TTable::kArray) {
         return MakeValue(fText, fItem->value);
+    }
     fElements.emplace_back();
     MakeValue(fText, fElements.back());
 }
@@ -339,28 +360,32 @@ TCIMValue TCimXmlReader::TakeValue(TItem& item)
 void TCimXmlReader::MakeValue(std::string_view text, TCIMValue& value)
 {
     const TType type = fItem->type.GetElementType();
-    if (type == TType::kString)
+    if (type == TType::kString) {
         value = IsObject(text) ? MakeObject(text) : fContext.GetTexts().MakeValue(text);
-    else if (!TValueText::Parse(type, text, value))
+    } else if (!TValueText::Parse(type, text, value)) {
         fContext.Fail(EStatus::kTypeMismatch, "found " + Quote(text) + " as value of " + Quote(fItem->name) + ", expected a " +
                                                   TValueText::GetTypeName(type));
+    }
 }
 
 bool TCimXmlReader::IsObject(std::string_view text) const
 {
-    if (fItem->text == TItem::kPerhapsObject)
+    if (fItem->text == TItem::kPerhapsObject) {
         return LooksLikeObject(text);
+    }
     return fItem->text == TItem::kObject && !text.empty();
 }
 
 TCIMValue TCimXmlReader::ReadObjects(const TCIMValue& value)
 {
-    if (value.IsNull())
+    if (value.IsNull()) {
         return value;
+    }
     if (value.GetType().IsArray()) {
         std::vector<TCIMValue> elements;
-        for (const TCIMValue& element : value.GetElements())
+        for (const TCIMValue& element : value.GetElements()) {
             elements.push_back(ReadObjects(element));
+        }
         return TCIMValue(value.GetType(), static_cast<unsigned int>(elements.size()), elements);
     }
     return TValueAccess::IsText(value) && LooksLikeObject(value.GetString()) ? MakeObject(value.GetString()) : value;
@@ -368,15 +393,18 @@ TCIMValue TCimXmlReader::ReadObjects(const TCIMValue& value)
 
 TCIMValue TCimXmlReader::MakeObject(std::string_view text)
 {
-    if (fContext.fEmbeddedDepth == kMaxEmbeddedDepth)
+    if (fContext.fEmbeddedDepth == kMaxEmbeddedDepth) {
         fContext.Fail(EStatus::kParseError, "embedded objects are nested too deeply");
-    if (!fEmbedded)
+    }
+    if (!fEmbedded) {
         fEmbedded = std::make_unique<TEmbedded>(fContext, fNamespace);
+    }
     ++fContext.fEmbeddedDepth;
     TCIMValue value(fEmbedded->Read(text));
     --fContext.fEmbeddedDepth;
-    if (fEmbedded->TakeMetUnknownClass())
+    if (fEmbedded->TakeMetUnknownClass()) {
         fPaths.NoteUnknownClass();
+    }
     return value;
 }
 

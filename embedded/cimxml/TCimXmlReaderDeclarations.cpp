@@ -98,9 +98,10 @@ void TCimXmlReader::EndQualifier()
 {
     TCIMValue value = TakeValue(fQualifier);
     fItem = &fProperty;
-    if (fDirect)
+    if (fDirect) {
         return fContext.Tolerate("qualifier of an instance", "qualifier " + TCimXmlContext::Quote(fQualifier.name) +
                                                                  " stands on an instance or its property; left out");
+    }
     fDraft.AddQualifier({fQualifierName, std::move(value), fFlavor, fPropagated});
 }
 
@@ -120,9 +121,11 @@ void TCimXmlReader::ReadScope(const TCimXmlAttributes& attributes)
         {"INDICATION", ICIMQualifierDecl::kScopeIndication}, {"PROPERTY", ICIMQualifierDecl::kScopeProperty},
         {"REFERENCE", ICIMQualifierDecl::kScopeReference},   {"METHOD", ICIMQualifierDecl::kScopeMethod},
         {"PARAMETER", ICIMQualifierDecl::kScopeParameter},   {"ANY", ICIMQualifierDecl::kScopeAny}};
-    for (const auto& [name, scope] : kScopes)
-        if (attributes.IsTrue(name, false))
+    for (const auto& [name, scope] : kScopes) {
+        if (attributes.IsTrue(name, false)) {
             fScope |= scope;
+        }
+    }
 }
 
 void TCimXmlReader::EndQualifierDecl()
@@ -160,18 +163,20 @@ void TCimXmlReader::FailUnexpected(const char* name) const
 const char* TCimXmlReader::Require(const TCimXmlAttributes& attributes, const char* name) const
 {
     const char* value = attributes.Find(name);
-    if (value == nullptr || *value == '\0')
+    if (value == nullptr || *value == '\0') {
         fContext.Fail(EStatus::kParseError, std::string("found <") + TElement::GetName(fOpen.back().element) + "> without " + name +
                                                 ", expected that attribute with a value");
+    }
     return value;
 }
 
 TType TCimXmlReader::ReadType(const char* text) const
 {
     const TType type = TValueText::FindType(text);
-    if (type == TType::kNone)
+    if (type == TType::kNone) {
         fContext.Fail(EStatus::kParseError,
                       "found type " + TCimXmlContext::Quote(text) + ", expected a CIM type such as string or uint32");
+    }
     return type;
 }
 

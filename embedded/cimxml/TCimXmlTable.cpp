@@ -155,8 +155,9 @@ constexpr TRow kRows[] = {
 constexpr std::array<T::EAction, T::kStateCount> MakeEndActions()
 {
     std::array<T::EAction, T::kStateCount> actions{};
-    for (T::EAction& action : actions)
+    for (T::EAction& action : actions) {
         action = T::kNothing;
+    }
     actions[T::kObject] = T::kEndObject;
     actions[T::kClass] = T::kEndClass;
     actions[T::kInstance] = T::kEndInstance;
@@ -184,10 +185,12 @@ using TSteps = std::array<std::array<T::TStep, E::kCount>, T::kStateCount>;
 constexpr TSteps MakeSteps()
 {
     TSteps steps{};
-    for (const TRow& row : kRows)
+    for (const TRow& row : kRows) {
         steps[row.state][row.element] = {row.next, row.action};
-    for (T::TStep& step : steps[T::kSkipped])
+    }
+    for (T::TStep& step : steps[T::kSkipped]) {
         step = {T::kSkipped, T::kNothing};
+    }
     return steps;
 }
 
@@ -209,14 +212,18 @@ TCimXmlTable::EAction TCimXmlTable::GetEndAction(EState state) noexcept
 std::string TCimXmlTable::DescribeExpected(EState state)
 {
     std::vector<std::string> names;
-    for (const TRow& row : kRows)
-        if (row.state == state)
+    for (const TRow& row : kRows) {
+        if (row.state == state) {
             names.push_back(std::string("<") + TCimXmlElement::GetName(row.element) + ">");
-    if (names.empty())
+        }
+    }
+    if (names.empty()) {
         return "nothing";
+    }
     std::string text = names.front();
-    for (std::size_t next = 1; next < names.size(); ++next)
+    for (std::size_t next = 1; next < names.size(); ++next) {
         text += (next + 1 == names.size() ? " or " : ", ") + names[next];
+    }
     return text;
 }
 

@@ -27,9 +27,11 @@ void AppendScope(std::string& out, TDecl::EScope scope)
         {"PROPERTY", TDecl::kScopeProperty},    {"METHOD", TDecl::kScopeMethod},           {"PARAMETER", TDecl::kScopeParameter},
         {"INDICATION", TDecl::kScopeIndication}};
     out += "<SCOPE";
-    for (const auto& [name, bit] : kScopes)
-        if ((scope & bit) != 0)
+    for (const auto& [name, bit] : kScopes) {
+        if ((scope & bit) != 0) {
             AppendFlag(out, name, true);
+        }
+    }
     out += "/>";
 }
 
@@ -96,14 +98,16 @@ void TCimXmlWriter::WriteNamespace(ICIMNamespace& ns, const std::string& namespa
     };
     ns.EnumerateQualifierDecls(writeDecl, TCallContext());
     const std::vector<boost::shared_ptr<ICIMClass>> classes = CollectClasses(ns);
-    for (const boost::shared_ptr<ICIMClass>& cls : classes)
+    for (const boost::shared_ptr<ICIMClass>& cls : classes) {
         WriteClass(*cls);
+    }
     const auto writeInstance = [&](const boost::shared_ptr<ICIMInstance>& instance) {
         WriteInstance(*instance);
         return true;
     };
-    for (const boost::shared_ptr<ICIMClass>& cls : classes)
+    for (const boost::shared_ptr<ICIMClass>& cls : classes) {
         cls->EnumerateInstances(writeInstance, false, TCallContext());
+    }
     EndDocument();
 }
 
@@ -128,8 +132,9 @@ void TCimXmlWriter::StartDocument(const std::string& namespaceName, const std::s
     fEnded = false;
     fBuffer.clear();  // of what a document that failed may have left
     fBuffer += "<?xml version=\"1.0\" encoding=\"utf-8\"?>\n<CIM CIMVERSION=\"2.0\" DTDVERSION=\"2.0\"><DECLARATION><DECLGROUP>\n";
-    if (!namespaceName.empty())
+    if (!namespaceName.empty()) {
         AppendNamespacePath(fBuffer, namespaceName, host);
+    }
 }
 
 /// Appends what `append` appends, or, where that throws, nothing.
@@ -143,8 +148,9 @@ void TCimXmlWriter::WriteElement(const TAppend& append)
         fBuffer.resize(start);
         throw;
     }
-    if (fBuffer.size() >= kPiece)
+    if (fBuffer.size() >= kPiece) {
         Flush();
+    }
 }
 
 void TCimXmlWriter::WriteQualifierDecl(const ICIMQualifierDecl& decl)
@@ -172,11 +178,13 @@ void TCimXmlWriter::WriteInstance(const ICIMInstance& instance)
 
 void TCimXmlWriter::EndDocument()
 {
-    if (!fEnded)
+    if (!fEnded) {
         fBuffer += "</DECLGROUP></DECLARATION></CIM>\n";
+    }
     fEnded = true;
-    if (!fBuffer.empty())
+    if (!fBuffer.empty()) {
         Flush();
+    }
 }
 
 std::string TCimXmlWriter::InstanceToXml(const ICIMInstance& instance)

@@ -8,8 +8,9 @@ namespace {
 
 std::string Compose(const std::string& message, const std::string& file, std::size_t line, std::size_t column)
 {
-    if (line == 0)
+    if (line == 0) {
         return file + ": " + message;
+    }
     return file + ":" + std::to_string(line) + ":" + std::to_string(column) + ": " + message;
 }
 

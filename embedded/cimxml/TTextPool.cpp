@@ -21,8 +21,9 @@ std::uint64_t HashOf(std::string_view text)
         return word;
     };
     std::uint64_t hash = text.size() * kFactor;
-    for (std::size_t position = 0; position + 8 < text.size(); position += 8)
+    for (std::size_t position = 0; position + 8 < text.size(); position += 8) {
         hash = (hash ^ load(position)) * kFactor ^ hash >> 32;
+    }
     return (hash ^ load(text.size() - 8)) * kFactor;
 }
 
@@ -30,15 +31,18 @@ std::uint64_t HashOf(std::string_view text)
 
 TCIMValue TTextPool::MakeValue(std::string_view text)
 {
-    if (text.size() <= TValueAccess::kShortTextSize || text.size() > kLongest)
+    if (text.size() <= TValueAccess::kShortTextSize || text.size() > kLongest) {
         return TCIMValue::FromText(text);
+    }
     const std::uint64_t hash = HashOf(text);
     const auto mark = static_cast<std::uint32_t>(hash);
     TBucket& bucket = fBuckets[hash >> 54];
-    if (bucket.hash == mark && bucket.text && bucket.text->GetText() == text)
+    if (bucket.hash == mark && bucket.text && bucket.text->GetText() == text) {
         return TValueAccess::FromSharedText(bucket.text);
-    if (std::exchange(bucket.last, mark) != mark)
+    }
+    if (std::exchange(bucket.last, mark) != mark) {
         return TCIMValue::FromText(text);
+    }
     bucket.text = TSharedText::Create(text);
     bucket.hash = mark;
     return TValueAccess::FromSharedText(bucket.text);

@@ -15,8 +15,9 @@ class TXmlParser::TEvents : public TXmlReader::ISink {
     {
         fParser.ParseCharData();
         fAttributes.clear();
-        for (const char** next = attributes; *next != nullptr; next += 2)
+        for (const char** next = attributes; *next != nullptr; next += 2) {
             fAttributes.emplace(next[0], next[1]);
+        }
         fParser.StartElement(name, fAttributes);
     }
 
@@ -41,8 +42,9 @@ class TXmlParser::TEvents : public TXmlReader::ISink {
 
     void HandOverText()
     {
-        if (fLength == 0)
+        if (fLength == 0) {
             return;
+        }
         const std::size_t length = fLength;
         fLength = 0;
         fParser.characters(fText, static_cast<unsigned int>(length));
@@ -52,8 +54,9 @@ class TXmlParser::TEvents : public TXmlReader::ISink {
     {
         fReader.Reset();
         fLength = 0;
-        if (!fReader.Parse(text, length, true))
+        if (!fReader.Parse(text, length, true)) {
             fParser.FatalError(fReader.GetError().c_str());
+        }
     }
 
     const TXmlReader& GetReader() const noexcept { return fReader; }

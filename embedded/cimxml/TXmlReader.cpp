@@ -24,8 +24,9 @@ struct TXmlReader::TCallbacks {
     static void Guarded(void* user, TAction action) noexcept
     {
         TXmlReader& reader = *static_cast<TXmlReader*>(user);
-        if (reader.fStopped)
+        if (reader.fStopped) {
             return;  // the library delivers a few events more after it was told to stop
+        }
         try {
             action(reader);
         } catch (...) {
@@ -37,12 +38,15 @@ struct TXmlReader::TCallbacks {
     static void Start(void* user, const char* name, const char** attributes) noexcept
     {
         Guarded(user, [=](TXmlReader& reader) {
-            if (++reader.fDepth > kMaxDepth)
+            if (++reader.fDepth > kMaxDepth) {
                 return reader.Refuse("elements are nested too deeply");
-            if (static_cast<std::size_t>(XML_GetCurrentByteCount(reader.fParser.get())) > kMaxTokenLength)
+            }
+            if (static_cast<std::size_t>(XML_GetCurrentByteCount(reader.fParser.get())) > kMaxTokenLength) {
                 return reader.Refuse("a tag is too long");
-            if (const char* reason = reader.FindExcess(attributes))
+            }
+            if (const char* reason = reader.FindExcess(attributes)) {
                 return reader.Refuse(reason);
+            }
             reader.HandOverText();
             reader.fSink.OnStart(name, attributes);
             reader.fText.clear();
@@ -62,8 +66,9 @@ struct TXmlReader::TCallbacks {
     static void Text(void* user, const char* text, int length) noexcept
     {
         Guarded(user, [=](TXmlReader& reader) {
-            if (reader.fText.size() + static_cast<std::size_t>(length) > kMaxTextLength)
+            if (reader.fText.size() + static_cast<std::size_t>(length) > kMaxTextLength) {
                 return reader.Refuse("text is too long");
+            }
             reader.fText.append(text, static_cast<std::size_t>(length));
         });
     }
@@ -87,8 +92,9 @@ struct TXmlReader::TCallbacks {
     static void Entity(void* user, const char*, int, const char*, int, const char*, const char*, const char*, const char*) noexcept
     {
         Guarded(user, [](TXmlReader& reader) {
-            if (++reader.fEntities > kMaxEntities)
+            if (++reader.fEntities > kMaxEntities) {
                 reader.Refuse("too many entity declarations");
+            }
         });
     }
 
@@ -106,8 +112,9 @@ struct TXmlReader::TCallbacks {
 
 TXmlReader::TXmlReader(ISink& sink) : fSink(sink), fParser(XML_ParserCreate(nullptr))
 {
-    if (!fParser)
+    if (!fParser) {
         throw std::bad_alloc();
+    }
     Install();
 }
 
@@ -133,8 +140,9 @@ void TXmlReader::Reset(const char* encoding)
 {
     // Resetting to an encoding would fall back to the document's own, without a word, where memory is short.
     XML_ParserReset(fParser.get(), nullptr);
-    if (encoding != nullptr && XML_SetEncoding(fParser.get(), encoding) == XML_STATUS_ERROR)
+    if (encoding != nullptr && XML_SetEncoding(fParser.get(), encoding) == XML_STATUS_ERROR) {
         throw std::bad_alloc();
+    }
     Install();
     fText.clear();
     fDepth = fEntities = fBytes = fDefaultBytes = 0;
@@ -149,13 +157,16 @@ const char* TXmlReader::FindExcess(const char** attributes)
 {
     const auto specified = static_cast<std::size_t>(XML_GetSpecifiedAttributeCount(fParser.get()));  // names and values
     std::size_t count = specified;
-    for (; attributes[count] != nullptr; count += 2)
+    for (; attributes[count] != nullptr; count += 2) {
         fDefaultBytes += std::strlen(attributes[count + 1]);
-    if (count > 2 * kMaxAttributes)
+    }
+    if (count > 2 * kMaxAttributes) {
         return "too many attributes";
+    }
     if (count > specified && fDefaultBytes > kExpansionThreshold &&
-        static_cast<double>(fDefaultBytes) > kMaxAmplification * static_cast<double>(fBytes))
+        static_cast<double>(fDefaultBytes) > kMaxAmplification * static_cast<double>(fBytes)) {
         return "attribute defaults expand too much";
+    }
     return nullptr;
 }
 
@@ -165,10 +176,12 @@ bool TXmlReader::Parse(const char* data, std::size_t length, bool last)
         const std::size_t piece = std::min<std::size_t>(length, INT_MAX / 2);
         const bool final = last && piece == length;
         fBytes += piece;
-        if (!Settle(XML_Parse(fParser.get(), data, static_cast<int>(piece), final) != XML_STATUS_ERROR))
+        if (!Settle(XML_Parse(fParser.get(), data, static_cast<int>(piece), final) != XML_STATUS_ERROR)) {
             return false;
-        if (final)
+        }
+        if (final) {
             break;
+        }
         data += piece;
         length -= piece;
     }
@@ -183,15 +196,17 @@ bool TXmlReader::Finish()
 char* TXmlReader::GetBuffer(std::size_t length)
 {
     void* buffer = length > INT_MAX / 2 ? nullptr : XML_GetBuffer(fParser.get(), static_cast<int>(length));
-    if (buffer == nullptr)
+    if (buffer == nullptr) {
         throw std::bad_alloc();
+    }
     return static_cast<char*>(buffer);
 }
 
 bool TXmlReader::ParseBuffer(std::size_t length)
 {
-    if (fStopped)
+    if (fStopped) {
         return fError.empty();
+    }
     fBytes += length;
     return Settle(XML_ParseBuffer(fParser.get(), static_cast<int>(length), XML_FALSE) != XML_STATUS_ERROR);
 }
@@ -199,19 +214,23 @@ bool TXmlReader::ParseBuffer(std::size_t length)
 /// Looks at what a call of the library left: a stopped parse, an error of the library, or a tag that goes on too long.
 bool TXmlReader::Settle(bool succeeded)
 {
-    if (fException)
+    if (fException) {
         std::rethrow_exception(std::exchange(fException, nullptr));
-    if (fStopped)
+    }
+    if (fStopped) {
         return fError.empty();
+    }
     if (!succeeded) {
         const XML_Error code = XML_GetErrorCode(fParser.get());
-        if (code == XML_ERROR_NO_MEMORY)
+        if (code == XML_ERROR_NO_MEMORY) {
             throw std::bad_alloc();
+        }
         Refuse(XML_ErrorString(code));
         return false;
     }
-    if (GetPending() > kMaxTokenLength)
+    if (GetPending() > kMaxTokenLength) {
         Refuse("a tag is too long");
+    }
     return fError.empty();
 }
 
@@ -237,8 +256,9 @@ void TXmlReader::Refuse(const char* reason)
 
 void TXmlReader::HandOverText()
 {
-    if (!fText.empty())
+    if (!fText.empty()) {
         fSink.OnText(fText.c_str(), fText.size());
+    }
 }
 
 std::size_t TXmlReader::GetLine() const

@@ -41,7 +41,7 @@ const TStatusText* GetTexts()
 const std::string& TZELStatusCode::TranslateStatusCode() const
 {
     const TStatusText* entry = GetTexts();
-    while (entry->fStatus != -1 && entry->fStatus != int(fStatus)) {
+    while (entry->fStatus != -1 && entry->fStatus != static_cast<int>(fStatus)) {
         ++entry;
     }
     return entry->fText;

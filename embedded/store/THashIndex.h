@@ -19,11 +19,13 @@ class THashIndex {
     template <class TMatch>
     std::uint32_t Find(std::uint32_t hash, TMatch&& matches) const
     {
-        if (fEntries.empty())
+        if (fEntries.empty()) {
             return kNone;
+        }
         for (std::size_t at = Home(hash); fEntries[at].ordinal != kNone; at = Next(at)) {
-            if (fEntries[at].hash == hash && matches(fEntries[at].ordinal))
+            if (fEntries[at].hash == hash && matches(fEntries[at].ordinal)) {
                 return fEntries[at].ordinal;
+            }
         }
         return kNone;
     }

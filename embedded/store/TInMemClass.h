@@ -120,7 +120,7 @@ class TInMemClass final : public TInMemNamedElement<ICIMClass>, public boost::en
 
     /// The layout. A slot stays the same as long as the class lives; slots and order of declaration differ.
     std::uint32_t FindSlot(std::string_view name) const noexcept;  ///< kNoSlot where there is no such property
-    std::uint32_t GetSlotCount() const noexcept { return std::uint32_t(fSlots.size()); }
+    std::uint32_t GetSlotCount() const noexcept { return static_cast<std::uint32_t>(fSlots.size()); }
     const TInMemPropertyDecl& GetSlotDecl(std::uint32_t slot) const noexcept { return *fSlots[slot]; }
     const boost::shared_ptr<TInMemPropertyDecl>& GetSharedSlotDecl(std::uint32_t slot) const noexcept { return fSlots[slot]; }
     /// The slots of all properties in order of declaration, inherited ones first.

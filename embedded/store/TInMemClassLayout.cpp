@@ -97,7 +97,7 @@ void TInMemClass::InheritDecl(std::string_view name)
 void TInMemClass::AppendSlot(const boost::shared_ptr<TInMemPropertyDecl>& decl)
 {
     const std::uint32_t slot = GetSlotCount();
-    fSlotIndex.Reserve(slot + std::size_t(1));
+    fSlotIndex.Reserve(slot + static_cast<std::size_t>(1));
     fSlots.push_back(decl);
     fSlotIndex.Add(TNameText::Hash(decl->GetName()), slot);
 }
@@ -147,7 +147,7 @@ void TInMemClass::TakeIn(const boost::shared_ptr<TInMemPropertyDecl>& decl, std:
         return;
     }
     AppendSlot(decl);
-    fOrder.insert(fOrder.begin() + std::ptrdiff_t(position), GetSlotCount() - 1);
+    fOrder.insert(fOrder.begin() + static_cast<std::ptrdiff_t>(position), GetSlotCount() - 1);
     ++fLayout;
     if (decl->IsKey()) {
         UpdateKeys();

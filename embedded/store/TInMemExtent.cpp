@@ -13,7 +13,7 @@ namespace {
 std::uint32_t Mix(std::uint32_t seed, const TCIMValue& key)
 {
     const std::uint64_t hash = key.Hash();
-    return (seed ^ std::uint32_t(hash ^ (hash >> 32))) * 0x01000193U + 0x9e3779b9U;
+    return (seed ^ static_cast<std::uint32_t>(hash ^ (hash >> 32))) * 0x01000193U + 0x9e3779b9U;
 }
 
 /// Keeps the positions from changing while a callback runs.
@@ -46,7 +46,7 @@ void TInMemExtent::Add(const boost::shared_ptr<TInMemInstance>& instance)
     FillGenerated(*instance);
     const std::uint32_t hash = HashOf(*instance);
     CheckNew(hash, *instance);
-    fIndex.Add(hash, std::uint32_t(fInstances.size()));
+    fIndex.Add(hash, static_cast<std::uint32_t>(fInstances.size()));
     fInstances.push_back(instance);
     instance->SetAdded(hash);
     CountGenerated(*instance);
@@ -212,14 +212,14 @@ bool TInMemExtent::Enumerate(const boost::function<bool(boost::shared_ptr<ICIMIn
 
 TInMemExtent::TMark TInMemExtent::GetMark() const noexcept
 {
-    return {std::uint32_t(fInstances.size()), fNextGenerated};
+    return {static_cast<std::uint32_t>(fInstances.size()), fNextGenerated};
 }
 
 void TInMemExtent::RollBack(const TMark& mark) noexcept
 {
     while (fInstances.size() > mark.size) {
         TInMemInstance& instance = *fInstances.back();
-        fIndex.Remove(instance.fKeyHash, std::uint32_t(fInstances.size() - 1));
+        fIndex.Remove(instance.fKeyHash, static_cast<std::uint32_t>(fInstances.size() - 1));
         instance.SetRemoved();
         fInstances.pop_back();
         --fCount;

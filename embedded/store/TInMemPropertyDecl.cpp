@@ -69,7 +69,7 @@ TCIMValue TInMemPropertyDecl::WithoutClasses(TCIMValue value)
     for (const TCIMValue& element : value.GetElements()) {
         elements.push_back(WithoutClasses(element));
     }
-    const TCIMValue copy(value.GetType(), unsigned(elements.size()), elements);
+    const TCIMValue copy(value.GetType(), static_cast<unsigned>(elements.size()), elements);
     return value.IsBag() ? copy.AsBag() : copy;
 }
 

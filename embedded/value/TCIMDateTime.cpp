@@ -46,7 +46,7 @@ bool ReadField(std::string_view text, const TField& field, std::int64_t& number,
 {
     const std::string_view digits = text.substr(field.fStart, field.fLength);
     if (digits.find_first_not_of('*') == std::string_view::npos) {
-        unknown = std::uint16_t(unknown | (1u << field.fBit));
+        unknown = static_cast<std::uint16_t>(unknown | (1u << field.fBit));
         number = field.fLeast;
         return true;
     }
@@ -59,7 +59,7 @@ bool ReadMicroseconds(std::string_view text, std::int64_t& number, std::uint16_t
     for (unsigned int i = 0; i < 6; ++i) {
         const char c = text[kMicroseconds + i];
         if (c == '*') {
-            unknown = std::uint16_t(unknown | (1u << (kFirstMicrosecondBit + i)));
+            unknown = static_cast<std::uint16_t>(unknown | (1u << (kFirstMicrosecondBit + i)));
         } else if (c < '0' || c > '9') {
             return false;
         }
@@ -133,7 +133,7 @@ bool ReadTimestamp(std::string_view text, std::int64_t& microseconds, std::uint1
     if (part[2] > GetDaysOfMonth(part[0], part[1]) || !ReadDigits(text.substr(kSign + 1), minutes)) {
         return false;
     }
-    offset = std::int16_t(text[kSign] == '-' ? -minutes : minutes);
+    offset = static_cast<std::int16_t>(text[kSign] == '-' ? -minutes : minutes);
     microseconds +=
         GetDays(part[0], part[1], part[2]) * kDay + part[3] * kHour + part[4] * kMinute + part[5] * kSecond - offset * kMinute;
     return true;
@@ -142,7 +142,7 @@ bool ReadTimestamp(std::string_view text, std::int64_t& microseconds, std::uint1
 void WriteDigits(char* to, std::size_t length, std::int64_t number) noexcept
 {
     for (std::size_t i = length; i-- > 0; number /= 10) {
-        to[i] = char('0' + number % 10);
+        to[i] = static_cast<char>('0' + number % 10);
     }
 }
 
@@ -204,7 +204,7 @@ std::string TCIMDateTime::ToText() const
     WriteDigits(&text[10], 2, rest % kHour / kMinute);
     WriteDigits(&text[12], 2, rest % kMinute / kSecond);
     WriteDigits(&text[kMicroseconds], 6, rest % kSecond);
-    WriteDigits(&text[kSign + 1], 3, std::abs(int(fOffset)));
+    WriteDigits(&text[kSign + 1], 3, std::abs(static_cast<int>(fOffset)));
     if (fInterval) {
         text[kSign] = ':';
         WriteDigits(&text[0], 8, days);

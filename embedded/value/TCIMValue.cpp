@@ -122,16 +122,18 @@ TCIMValue::~TCIMValue()
 
 TCIMValue::TCIMValue(bool value) noexcept : TCIMValue(TAccess::FromBits(TCIMType::kBoolean, value ? 1 : 0)) {}
 TCIMValue::TCIMValue(unsigned char value) noexcept : TCIMValue(TAccess::FromBits(TCIMType::kUint8, value)) {}
-TCIMValue::TCIMValue(signed char value) noexcept : TCIMValue(TAccess::FromBits(TCIMType::kSint8, std::uint64_t(value))) {}
+TCIMValue::TCIMValue(signed char value) noexcept : TCIMValue(TAccess::FromBits(TCIMType::kSint8, static_cast<std::uint64_t>(value)))
+{}
 TCIMValue::TCIMValue(unsigned short value) noexcept : TCIMValue(TAccess::FromBits(TCIMType::kUint16, value)) {}
-TCIMValue::TCIMValue(short value) noexcept : TCIMValue(TAccess::FromBits(TCIMType::kSint16, std::uint64_t(value))) {}
+TCIMValue::TCIMValue(short value) noexcept : TCIMValue(TAccess::FromBits(TCIMType::kSint16, static_cast<std::uint64_t>(value))) {}
 TCIMValue::TCIMValue(unsigned int value) noexcept : TCIMValue(TAccess::FromBits(TCIMType::kUint32, value)) {}
-TCIMValue::TCIMValue(int value) noexcept : TCIMValue(TAccess::FromBits(TCIMType::kSint32, std::uint64_t(value))) {}
+TCIMValue::TCIMValue(int value) noexcept : TCIMValue(TAccess::FromBits(TCIMType::kSint32, static_cast<std::uint64_t>(value))) {}
 TCIMValue::TCIMValue(unsigned long value) noexcept : TCIMValue(TAccess::FromBits(TCIMType::kUint64, value)) {}
-TCIMValue::TCIMValue(long value) noexcept : TCIMValue(TAccess::FromBits(TCIMType::kSint64, std::uint64_t(value))) {}
+TCIMValue::TCIMValue(long value) noexcept : TCIMValue(TAccess::FromBits(TCIMType::kSint64, static_cast<std::uint64_t>(value))) {}
 TCIMValue::TCIMValue(unsigned long long value) noexcept : TCIMValue(TAccess::FromBits(TCIMType::kUint64, value)) {}
-TCIMValue::TCIMValue(long long value) noexcept : TCIMValue(TAccess::FromBits(TCIMType::kSint64, std::uint64_t(value))) {}
-TCIMValue::TCIMValue(float value) noexcept : TCIMValue(TAccess::FromReal(TCIMType::kReal32, double(value))) {}
+TCIMValue::TCIMValue(long long value) noexcept : TCIMValue(TAccess::FromBits(TCIMType::kSint64, static_cast<std::uint64_t>(value)))
+{}
+TCIMValue::TCIMValue(float value) noexcept : TCIMValue(TAccess::FromReal(TCIMType::kReal32, static_cast<double>(value))) {}
 TCIMValue::TCIMValue(double value) noexcept : TCIMValue(TAccess::FromReal(TCIMType::kReal64, value)) {}
 TCIMValue::TCIMValue(char16_t value) noexcept : TCIMValue(TAccess::FromBits(TCIMType::kChar16, value)) {}
 TCIMValue::TCIMValue(const std::string& text) : TCIMValue(FromText(text)) {}
@@ -164,7 +166,7 @@ TCIMValue::TCIMValue(TCIMType type, unsigned int count, const std::vector<TCIMVa
         RefuseType();
     }
     std::vector<TCIMValue> taken(elements.begin(),
-                                 elements.begin() + std::ptrdiff_t(std::min<std::size_t>(count, elements.size())));
+                                 elements.begin() + static_cast<std::ptrdiff_t>(std::min<std::size_t>(count, elements.size())));
     for (TCIMValue& element : taken) {
         if (element.IsNull()) {
             element = Null(elementType);
@@ -238,7 +240,7 @@ std::int64_t TCIMValue::GetSigned() const
     if (IsNull() || !IsSigned(fType)) {
         RefuseType();
     }
-    return std::int64_t(TAccess::GetBits(*this));
+    return static_cast<std::int64_t>(TAccess::GetBits(*this));
 }
 
 double TCIMValue::GetReal() const

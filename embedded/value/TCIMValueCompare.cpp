@@ -128,9 +128,10 @@ std::size_t TCIMValue::Hash() const
         return 0;
     case TAccess::kNumber:
         return IsReal(fType) ? std::hash<double>()(std::isnan(GetReal()) ? 1e-300 : GetReal())
-                             : Mix(fType, std::size_t(TAccess::GetBits(*this)));
+                             : Mix(fType, static_cast<std::size_t>(TAccess::GetBits(*this)));
     case TAccess::kDateTime:
-        return Mix(std::size_t(TAccess::LoadDateTime(*this).GetMicroseconds()), TAccess::LoadDateTime(*this).GetUnknown());
+        return Mix(static_cast<std::size_t>(TAccess::LoadDateTime(*this).GetMicroseconds()),
+                   TAccess::LoadDateTime(*this).GetUnknown());
     case TAccess::kObject:
         return GetEmbeddedObject()->Hash();
     case TAccess::kArray:

@@ -12,7 +12,7 @@ struct TIntegerRange {
 };
 
 template <class T>
-constexpr TIntegerRange kRangeOf{std::numeric_limits<T>::min(), std::uint64_t(std::numeric_limits<T>::max())};
+constexpr TIntegerRange kRangeOf{std::numeric_limits<T>::min(), static_cast<std::uint64_t>(std::numeric_limits<T>::max())};
 
 // By type code, from uint8 to sint64.
 constexpr TIntegerRange kIntegerRanges[] = {kRangeOf<std::uint8_t>,  kRangeOf<std::int8_t>,   kRangeOf<std::uint16_t>,
@@ -25,17 +25,18 @@ TInteger TInteger::Read(const TCIMValue& value) noexcept
 {
     const std::uint64_t bits = TValueAccess::GetBits(value);
     const bool isNegative = IsOfSigned(value.GetType()) && (bits >> 63) != 0;
-    return {isNegative ? std::uint64_t(0) - bits : bits, isNegative};
+    return {isNegative ? static_cast<std::uint64_t>(0) - bits : bits, isNegative};
 }
 
 bool TInteger::Make(TCIMValue::TCIMType::ECIMType type, TCIMValue& result) const noexcept
 {
     const TIntegerRange& range = kIntegerRanges[type - TCIMValue::TCIMType::kUint8];
-    const std::uint64_t bound = fIsNegative ? std::uint64_t(0) - std::uint64_t(range.fLeast) : range.fGreatest;
+    const std::uint64_t bound =
+        fIsNegative ? static_cast<std::uint64_t>(0) - static_cast<std::uint64_t>(range.fLeast) : range.fGreatest;
     if (fMagnitude > bound) {
         return false;
     }
-    result = TValueAccess::FromBits(type, fIsNegative ? std::uint64_t(0) - fMagnitude : fMagnitude);
+    result = TValueAccess::FromBits(type, fIsNegative ? static_cast<std::uint64_t>(0) - fMagnitude : fMagnitude);
     return true;
 }
 

@@ -28,7 +28,8 @@ int TNameText::Compare(std::string_view a, std::string_view b) noexcept
 {
     const std::size_t common = std::min(a.size(), b.size());
     for (std::size_t i = 0; i < common; ++i) {
-        const int difference = int(static_cast<unsigned char>(ToLower(a[i]))) - int(static_cast<unsigned char>(ToLower(b[i])));
+        const int difference = static_cast<int>(static_cast<unsigned char>(ToLower(a[i]))) -
+                               static_cast<int>(static_cast<unsigned char>(ToLower(b[i])));
         if (difference != 0) {
             return difference;
         }
@@ -42,7 +43,7 @@ std::uint32_t TNameText::Hash(std::string_view name) noexcept
     for (const char c : name) {
         hash = (hash ^ static_cast<unsigned char>(ToLower(c))) * 0x100000001b3u;
     }
-    return std::uint32_t(hash ^ (hash >> 32));
+    return static_cast<std::uint32_t>(hash ^ (hash >> 32));
 }
 
 }  // namespace NORVZEL20

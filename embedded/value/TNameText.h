@@ -14,7 +14,7 @@ class TNameText {
   public:
     TNameText() = delete;
 
-    static constexpr char ToLower(char c) noexcept { return c >= 'A' && c <= 'Z' ? char(c + ('a' - 'A')) : c; }
+    static constexpr char ToLower(char c) noexcept { return c >= 'A' && c <= 'Z' ? static_cast<char>(c + ('a' - 'A')) : c; }
     static std::string ToLower(std::string_view name);
     static bool Equal(std::string_view a, std::string_view b) noexcept;
     /// Negative, zero or positive, as the lower-case forms compare byte for byte.

@@ -12,7 +12,7 @@ const TSharedText* TSharedText::CreateRaw(std::string_view text)
         throw std::bad_alloc();
     }
     void* memory = ::operator new(sizeof(TSharedText) + text.size());
-    TSharedText* block = new (memory) TSharedText(std::uint32_t(text.size()));
+    TSharedText* block = new (memory) TSharedText(static_cast<std::uint32_t>(text.size()));
     if (!text.empty()) {
         std::memcpy(static_cast<void*>(block + 1), text.data(), text.size());
     }

@@ -111,7 +111,7 @@ bool ParseReal(TType::ECIMType type, std::string_view text, TCIMValue& result)
         if (type == TType::kReal64 ? !ReadReal(text, number) : !ReadReal(text, narrow)) {
             return false;
         }
-        number = type == TType::kReal64 ? number : double(narrow);
+        number = type == TType::kReal64 ? number : static_cast<double>(narrow);
     }
     result = TValueAccess::FromReal(type, number);
     return true;
@@ -273,21 +273,22 @@ void TValueText::AppendReal(std::string& out, double number, bool isReal32)
     }
     char digits[32];
     char* const end = digits + sizeof digits;
-    out.append(digits, isReal32 ? std::to_chars(digits, end, float(number)).ptr : std::to_chars(digits, end, number).ptr);
+    out.append(digits,
+               isReal32 ? std::to_chars(digits, end, static_cast<float>(number)).ptr : std::to_chars(digits, end, number).ptr);
 }
 
 void TValueText::AppendChar16(std::string& out, char16_t unit)
 {
     const unsigned int code = unit;
     if (code < 0x80) {
-        out += char(code);
+        out += static_cast<char>(code);
     } else if (code < 0x800) {
-        out += char(0xC0u | code >> 6);
-        out += char(0x80u | (code & 0x3Fu));
+        out += static_cast<char>(0xC0u | code >> 6);
+        out += static_cast<char>(0x80u | (code & 0x3Fu));
     } else {
-        out += char(0xE0u | code >> 12);
-        out += char(0x80u | (code >> 6 & 0x3Fu));
-        out += char(0x80u | (code & 0x3Fu));
+        out += static_cast<char>(0xE0u | code >> 12);
+        out += static_cast<char>(0x80u | (code >> 6 & 0x3Fu));
+        out += static_cast<char>(0x80u | (code & 0x3Fu));
     }
 }
 

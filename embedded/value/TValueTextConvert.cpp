@@ -24,15 +24,16 @@ bool ConvertToReal(const TCIMValue& value, TType::ECIMType type, TCIMValue& resu
         number = value.GetReal();
     } else {
         const TInteger integer = TInteger::Read(value);
-        number = double(integer.fMagnitude);
+        number = static_cast<double>(integer.fMagnitude);
         // 2^64 itself would not convert back.
-        if (number >= 0x1p64 || std::uint64_t(number) != integer.fMagnitude) {
+        if (number >= 0x1p64 || static_cast<std::uint64_t>(number) != integer.fMagnitude) {
             return false;
         }
         number = integer.fIsNegative ? -number : number;
     }
     if (type == TType::kReal32 && !std::isnan(number) && !std::isinf(number) &&
-        (std::fabs(number) > double(std::numeric_limits<float>::max()) || double(float(number)) != number)) {
+        (std::fabs(number) > static_cast<double>(std::numeric_limits<float>::max()) ||
+         static_cast<double>(static_cast<float>(number)) != number)) {
         return false;
     }
     result = TValueAccess::FromReal(type, number);
@@ -59,7 +60,7 @@ bool ConvertArray(const TCIMValue& value, TType type, TCIMValue& result)
             return false;
         }
     }
-    TCIMValue array(type, unsigned(elements.size()), elements);
+    TCIMValue array(type, static_cast<unsigned>(elements.size()), elements);
     result = value.IsBag() ? array.AsBag() : array;
     return true;
 }
