@@ -1,66 +1,25 @@
 #include "client/text/DisplayText.h"
 
-#include <cstdint>
+#include "embedded/value/TUtf8.h"
 
 namespace NORVZEL20 {
 
 namespace {
 
-struct TCharacter {
-    std::uint32_t code;
-    std::size_t length;  // 0: no UTF-8
-};
-
-// Length of the sequence that a lead byte announces, 0 for none.
-std::size_t AnnouncedLength(unsigned char lead)
-{
-    if (lead < 0x80) {
-        return 1;
-    }
-    if (lead >= 0xC2 && lead <= 0xDF) {
-        return 2;
-    }
-    if (lead >= 0xE0 && lead <= 0xEF) {
-        return 3;
-    }
-    return lead >= 0xF0 && lead <= 0xF4 ? 4 : 0;
-}
-
-TCharacter Decode(std::string_view text)
-{
-    const unsigned char lead = static_cast<unsigned char>(text[0]);
-    const std::size_t length = AnnouncedLength(lead);
-    if (length == 1) {
-        return {lead, 1};
-    }
-    if (length == 0 || length > text.size()) {
-        return {lead, 0};
-    }
-    std::uint32_t code = lead & (0x7Fu >> length);
-    for (std::size_t i = 1; i < length; ++i) {
-        const unsigned char next = static_cast<unsigned char>(text[i]);
-        if ((next & 0xC0) != 0x80) {
-            return {lead, 0};
-        }
-        code = (code << 6) | (next & 0x3Fu);
-    }
-    return {code, length};
-}
-
-bool IsUnsafe(std::uint32_t code)
+bool IsUnsafe(char32_t code)
 {
     return code < 0x20 || (code >= 0x7F && code < 0xA0) || code == 0x061C || code == 0x200E || code == 0x200F ||
            (code >= 0x2028 && code <= 0x202E) || (code >= 0x2066 && code <= 0x2069) || code == 0xFEFF;
 }
 
-void AppendHex(std::string& out, std::uint32_t code, int digits)
+void AppendHex(std::string& out, char32_t code, int digits)
 {
     for (int shift = (digits - 1) * 4; shift >= 0; shift -= 4) {
         out += "0123456789abcdef"[(code >> shift) & 0xF];
     }
 }
 
-void AppendEscape(std::string& out, std::uint32_t code)
+void AppendEscape(std::string& out, char32_t code)
 {
     switch (code) {
     case '\n':
@@ -104,7 +63,7 @@ std::string EscapeForDisplay(std::string_view text)
     std::string out;
     out.reserve(text.size());
     while (!text.empty()) {
-        const TCharacter character = Decode(text);
+        const TUtf8::TCharacter character = TUtf8::Decode(text);
         if (character.length == 0) {
             out += "\\x";
             AppendHex(out, character.code, 2);

@@ -4,6 +4,7 @@
 
 #include "embedded/cimxml/TXmlReader.h"
 #include "embedded/value/TNameText.h"
+#include "embedded/value/TUtf8.h"
 
 namespace NORVZEL20 {
 
@@ -72,15 +73,10 @@ void TCimXmlContext::CheckName(const char* what, std::string_view name) const
 std::string TCimXmlContext::Quote(std::string_view text)
 {
     constexpr std::size_t kLongest = 80;
+    const std::string_view start = TUtf8::Shorten(text, kLongest);
     std::string quoted = "\"";
-    for (const char c : text.substr(0, kLongest)) {
+    for (const char c : start) {
         quoted += static_cast<unsigned char>(c) < ' ' ? '.' : c;
-    }
-    while (text.size() > kLongest && (static_cast<unsigned char>(quoted.back()) & 0xC0) == 0x80) {
-        quoted.pop_back();  // not in the middle of a character: first its continuation bytes ...
-    }
-    if (text.size() > kLongest && static_cast<unsigned char>(quoted.back()) >= 0xC0) {
-        quoted.pop_back();  // ... then its first one
     }
     return quoted + (text.size() > kLongest ? "...\"" : "\"");
 }

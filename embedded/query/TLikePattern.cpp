@@ -2,35 +2,23 @@
 
 #include <algorithm>
 
+#include "embedded/value/TUtf8.h"
+
 namespace NORVZEL20 {
 
 namespace {
 
-std::size_t SequenceLength(unsigned char lead)
-{
-    if (lead < 0xc2) {
-        return 1;
-    }
-    return lead < 0xe0 ? 2 : lead < 0xf0 ? 3 : lead < 0xf5 ? 4 : 1;
-}
-
-/// Bytes outside of UTF-8 get numbers beyond those of all characters, so that they equal nothing but themselves.
+/// A byte outside of UTF-8 gets a number beyond those of the characters, so that it equals nothing but the same byte.
 std::vector<char32_t> Decode(std::string_view text)
 {
+    constexpr char32_t kFirstByte = 0x110000;
     std::vector<char32_t> characters;
     characters.reserve(text.size());
-    for (std::size_t at = 0; at < text.size();) {
-        const auto lead = static_cast<unsigned char>(text[at]);
-        const std::size_t length = SequenceLength(lead);
-        char32_t character = length == 1 ? lead : char32_t(lead & (0xffU >> (length + 1)));
-        bool isWhole = at + length <= text.size() && (lead < 0x80 || length > 1);
-        for (std::size_t next = 1; isWhole && next < length; ++next) {
-            const auto byte = static_cast<unsigned char>(text[at + next]);
-            isWhole = (byte & 0xc0U) == 0x80;
-            character = character << 6 | (byte & 0x3fU);
-        }
-        characters.push_back(isWhole ? character : char32_t(0x110000U + lead));
-        at += isWhole ? length : 1;
+    while (!text.empty()) {
+        const TUtf8::TCharacter character = TUtf8::Decode(text);
+        const bool isCharacter = character.length != 0;
+        characters.push_back(isCharacter ? character.code : kFirstByte + character.code);
+        text.remove_prefix(isCharacter ? character.length : 1);
     }
     return characters;
 }

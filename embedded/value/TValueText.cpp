@@ -7,6 +7,7 @@
 
 #include "embedded/value/TInteger.h"
 #include "embedded/value/TNameText.h"
+#include "embedded/value/TUtf8.h"
 #include "embedded/value/TValueAccess.h"
 #include "host/TCIMDateTime.h"
 
@@ -117,31 +118,17 @@ bool ParseReal(TType::ECIMType type, std::string_view text, TCIMValue& result)
     return true;
 }
 
-bool IsContinuation(char c) noexcept
-{
-    return (static_cast<unsigned char>(c) & 0xC0u) == 0x80u;
-}
-
 bool ParseChar16(std::string_view text, TCIMValue& result)
 {
-    const auto byte = [text](std::size_t i) { return static_cast<unsigned char>(text[i]); };
-    unsigned int unit = 0;
-    unsigned int least = 0;
-    if (text.size() == 1 && byte(0) < 0x80u) {
-        unit = byte(0);
-    } else if (text.size() == 2 && (byte(0) & 0xE0u) == 0xC0u && IsContinuation(text[1])) {
-        unit = (byte(0) & 0x1Fu) << 6 | (byte(1) & 0x3Fu);
-        least = 0x80;
-    } else if (text.size() == 3 && (byte(0) & 0xF0u) == 0xE0u && IsContinuation(text[1]) && IsContinuation(text[2])) {
-        unit = (byte(0) & 0x0Fu) << 12 | (byte(1) & 0x3Fu) << 6 | (byte(2) & 0x3Fu);
-        least = 0x800;
-    } else {
+    if (text.empty()) {
         return false;
     }
-    if (unit < least) {
+    // A unit may be half of a surrogate pair, so only overlong forms are refused.
+    const TUtf8::TCharacter character = TUtf8::Decode(text);
+    if (character.length != text.size() || character.code > 0xFFFF || character.IsOverlong()) {
         return false;
     }
-    result = TCIMValue(char16_t(unit));
+    result = TCIMValue(static_cast<char16_t>(character.code));
     return true;
 }
 
@@ -201,7 +188,7 @@ void TValueText::AppendPlain(std::string& out, const TCIMValue& value)
         out += value.GetBoolean() ? "TRUE" : "FALSE";
         break;
     case TType::kChar16:
-        AppendChar16(out, value.GetChar16());
+        TUtf8::Append(out, value.GetChar16());
         break;
     case TType::kString:
         out += value.GetString();
@@ -275,21 +262,6 @@ void TValueText::AppendReal(std::string& out, double number, bool isReal32)
     char* const end = digits + sizeof digits;
     out.append(digits,
                isReal32 ? std::to_chars(digits, end, static_cast<float>(number)).ptr : std::to_chars(digits, end, number).ptr);
-}
-
-void TValueText::AppendChar16(std::string& out, char16_t unit)
-{
-    const unsigned int code = unit;
-    if (code < 0x80) {
-        out += static_cast<char>(code);
-    } else if (code < 0x800) {
-        out += static_cast<char>(0xC0u | code >> 6);
-        out += static_cast<char>(0x80u | (code & 0x3Fu));
-    } else {
-        out += static_cast<char>(0xE0u | code >> 12);
-        out += static_cast<char>(0x80u | (code >> 6 & 0x3Fu));
-        out += static_cast<char>(0x80u | (code & 0x3Fu));
-    }
 }
 
 }  // namespace NORVZEL20

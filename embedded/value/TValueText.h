@@ -50,8 +50,6 @@ class TValueText {
     static void AppendSigned(std::string& out, std::int64_t number);
     /// The shortest text that reads back as the same double (for real32: as the same float); INF, -INF, NaN.
     static void AppendReal(std::string& out, double number, bool isReal32);
-    /// UTF-8 of one UCS-2 unit, surrogates encoded as they are.
-    static void AppendChar16(std::string& out, char16_t unit);
 
   private:
     static void EscapeFrom(std::string& out, std::size_t start, char quote);

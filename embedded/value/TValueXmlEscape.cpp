@@ -1,3 +1,4 @@
+#include "embedded/value/TUtf8.h"
 #include "embedded/value/TValueXml.h"
 
 namespace NORVZEL20 {
@@ -6,30 +7,12 @@ namespace {
 
 constexpr const char* kReplacement = "\xEF\xBF\xBD";
 
-bool IsContinuation(std::string_view text, std::size_t position)
+/// The length of the character that XML 1.0 allows at the beginning of `text`; 0 if there is none.
+std::size_t GetXmlLength(std::string_view text)
 {
-    return position < text.size() && (static_cast<unsigned char>(text[position]) & 0xC0u) == 0x80u;
-}
-
-// The length of the UTF-8 sequence of an XML character that starts at `position` with a byte above 0x7F; 0 where there is none.
-std::size_t GetSequenceLength(std::string_view text, std::size_t position)
-{
-    const auto byte = [text](std::size_t i) { return static_cast<unsigned char>(text[i]); };
-    const unsigned int first = byte(position);
-    const std::size_t length = first < 0xC2u ? 0 : (first < 0xE0u ? 2 : (first < 0xF0u ? 3 : (first < 0xF5u ? 4 : 0)));
-    for (std::size_t i = 1; i < length; ++i) {
-        if (!IsContinuation(text, position + i)) {
-            return 0;
-        }
-    }
-    if (length < 3) {
-        return length;
-    }
-    const unsigned int second = byte(position + 1);
-    const bool isOverlong = (first == 0xE0u && second < 0xA0u) || (first == 0xF0u && second < 0x90u);
-    const bool isBeyond = (first == 0xEDu && second > 0x9Fu) || (first == 0xF4u && second > 0x8Fu);  // surrogates, above U+10FFFF
-    const bool isNoCharacter = first == 0xEFu && second == 0xBFu && byte(position + 2) >= 0xBEu;     // U+FFFE, U+FFFF
-    return isOverlong || isBeyond || isNoCharacter ? 0 : length;
+    const TUtf8::TCharacter character = TUtf8::Decode(text);
+    const bool isForbidden = character.code == 0xFFFE || character.code == 0xFFFF;
+    return character.IsOverlong() || !character.IsScalar() || isForbidden ? 0 : character.length;
 }
 
 bool IsPlain(char c)
@@ -79,7 +62,7 @@ void AppendText(std::string& out, std::string_view text, bool isAttribute)
         if (i == text.size()) {
             return;
         }
-        const std::size_t length = static_cast<unsigned char>(text[i]) >= 0x80 ? GetSequenceLength(text, i) : 0;
+        const std::size_t length = static_cast<unsigned char>(text[i]) >= 0x80 ? GetXmlLength(text.substr(i)) : 0;
         if (length > 0) {
             out += text.substr(i, length);
         } else {
