@@ -37,6 +37,7 @@ TEST(Utf8Test, EachTextBeginsWithItsCharacterOrWithNone)
         {"\xF5\x80\x80\x80", 0xF5, 0, "good"},
         {"\xFF", 0xFF, 0, "good"},
         {"\xC3", 0xC3, 0, "good"},
+        {std::string_view("\xC3\xA4", 1), 0xC3, 0, "good"},
         {"\xC3(", 0xC3, 0, "good"},
         {"\xE2\x82", 0xE2, 0, "good"},
         {"\xE2\x28\xA1", 0xE2, 0, "good"},
