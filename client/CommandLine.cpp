@@ -2,6 +2,7 @@
 
 #include <CLI/CLI.hpp>
 #include <algorithm>
+#include <boost/algorithm/string/join.hpp>
 #include <exception>
 #include <functional>
 #include <sstream>
@@ -12,6 +13,7 @@
 #include "client/commands/QueryCommand.h"
 #include "client/commands/ShowCommand.h"
 #include "client/process/LackOfMemory.h"
+#include "client/report/OutputFormats.h"
 
 namespace NORVZEL20 {
 
@@ -33,6 +35,14 @@ std::string Unguard(std::string text)
 {
     text.erase(std::remove(text.begin(), text.end(), kGuard), text.end());
     return text;
+}
+
+// "text, json or cimxml"
+std::string Alternatives(std::vector<std::string> names)
+{
+    const std::string last = names.back();
+    names.pop_back();
+    return boost::algorithm::join(names, ", ") + " or " + last;
 }
 
 std::string RefuseEmpty(const std::string& text)
@@ -102,10 +112,13 @@ class TCommandLine {
         return command->add_option(name, target, description)->transform(&Unguard)->check(&RefuseEmpty);
     }
 
-    static void AddFormat(CLI::App* command, std::string& format)
+    static void AddFormat(CLI::App* command, EOutputFormat& format)
     {
-        AddText(command, "-o,--format", format, "text, json, ndjson or cimxml (text)")
-            ->check(CLI::IsMember({"text", "json", "ndjson", "cimxml"}))
+        const std::function<void(const std::string&)> set = [&format](const std::string& name) { format = OutputFormatOf(name); };
+        command->add_option_function("-o,--format", set, Alternatives(OutputFormatNames()) + " (text)")
+            ->transform(&Unguard)
+            ->check(&RefuseEmpty)
+            ->check(CLI::IsMember(OutputFormatNames()))
             ->option_text("FORMAT");
     }
 

@@ -11,15 +11,19 @@ namespace NORVZEL20 {
 
 namespace {
 
-std::string Write(const TComparisonReport& report, const std::string& format, bool colored)
+std::string Write(const TComparisonReport& report, EOutputFormat format, bool colored)
 {
-    if (format == "json") {
+    switch (format) {
+    case EOutputFormat::kJson:
         return WriteJsonReport(report);
-    }
-    if (format == "ndjson") {
+    case EOutputFormat::kNdjson:
         return WriteNdjsonReport(report);
+    case EOutputFormat::kCimXml:
+        return WriteCimXmlReport(report);
+    case EOutputFormat::kText:
+        break;
     }
-    return format == "cimxml" ? WriteCimXmlReport(report) : TTextFormat(report, colored).Write();
+    return TTextFormat(report, colored).Write();
 }
 
 }  // namespace

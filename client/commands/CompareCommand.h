@@ -4,6 +4,7 @@
 #include <vector>
 
 #include "client/process/IConsole.h"
+#include "client/report/EOutputFormat.h"
 
 namespace NORVZEL20 {
 
@@ -12,8 +13,8 @@ struct TCompareOptions {
     std::string reference;
     std::vector<std::string> others;  ///< at least one
     std::string rules;                ///< empty: everything is compared
-    std::string format = "text";      ///< text, json, ndjson or cimxml
-    std::string output;               ///< empty: standard output
+    EOutputFormat format = EOutputFormat::kText;
+    std::string output;  ///< empty: standard output
     bool strictSchema = false;
 };
 

@@ -3,6 +3,7 @@
 #include <string>
 
 #include "client/process/IConsole.h"
+#include "client/report/EOutputFormat.h"
 
 namespace NORVZEL20 {
 
@@ -10,8 +11,8 @@ namespace NORVZEL20 {
 struct TQueryOptions {
     std::string query;
     std::string inventory;
-    std::string format = "text";  ///< text, json, ndjson or cimxml
-    std::string output;           ///< empty: standard output
+    EOutputFormat format = EOutputFormat::kText;
+    std::string output;  ///< empty: standard output
 };
 
 /// Writes the instances of an inventory that answer a query in WQL. Returns 0. Errors: TClientError.

@@ -3,15 +3,16 @@
 #include <string>
 
 #include "client/process/IConsole.h"
+#include "client/report/EOutputFormat.h"
 
 namespace NORVZEL20 {
 
 /// What `cimdelta show` was asked.
 struct TShowOptions {
     std::string inventory;
-    std::string className;        ///< empty: the classes are listed
-    std::string format = "text";  ///< text, json, ndjson or cimxml
-    std::string output;           ///< empty: standard output
+    std::string className;  ///< empty: the classes are listed
+    EOutputFormat format = EOutputFormat::kText;
+    std::string output;  ///< empty: standard output
 };
 
 /// Writes what an inventory holds: its classes, or the instances of one class and those below it. Returns 0. Errors: TClientError.

@@ -62,9 +62,9 @@ TJson InstanceAsJson(const ICIMInstance& instance, const std::vector<std::string
 }
 
 // One document for all, or a line for each.
-std::string WriteDocuments(const TJson& documents, const std::string& format)
+std::string WriteDocuments(const TJson& documents, EOutputFormat format)
 {
-    if (format == "json") {
+    if (format == EOutputFormat::kJson) {
         return WriteJson(documents, true);
     }
     std::string lines;
@@ -154,12 +154,12 @@ TJson ClassesAsJson(TInMemNamespace& ns)
 }  // namespace
 
 std::string WriteInstances(const TInventory& inventory, const std::vector<boost::shared_ptr<ICIMInstance>>& instances,
-                           const std::vector<std::string>& properties, const std::string& format)
+                           const std::vector<std::string>& properties, EOutputFormat format)
 {
-    if (format == "cimxml") {
+    if (format == EOutputFormat::kCimXml) {
         return InstancesAsCimXml(inventory, instances);
     }
-    if (format == "text") {
+    if (format == EOutputFormat::kText) {
         std::string text;
         for (const boost::shared_ptr<ICIMInstance>& instance : instances) {
             text += InstanceAsText(*instance, properties);
@@ -173,12 +173,12 @@ std::string WriteInstances(const TInventory& inventory, const std::vector<boost:
     return WriteDocuments(documents, format);
 }
 
-std::string WriteClasses(const TInventory& inventory, const std::string& format)
+std::string WriteClasses(const TInventory& inventory, EOutputFormat format)
 {
-    if (format == "cimxml") {
+    if (format == EOutputFormat::kCimXml) {
         return NamespaceAsCimXml(inventory);
     }
-    return format == "text" ? ClassesAsText(*inventory.ns) : WriteDocuments(ClassesAsJson(*inventory.ns), format);
+    return format == EOutputFormat::kText ? ClassesAsText(*inventory.ns) : WriteDocuments(ClassesAsJson(*inventory.ns), format);
 }
 
 }  // namespace NORVZEL20

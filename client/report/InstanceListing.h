@@ -5,19 +5,19 @@
 #include <vector>
 
 #include "client/inventory/TInventory.h"
+#include "client/report/EOutputFormat.h"
 #include "host/ICIMInstance.h"
 
 namespace NORVZEL20 {
 
 /// Instances as `query` and `show` write them, in the order given.
 ///
-/// `format` is text, json, ndjson or cimxml. `properties` names those to be written, in their order; empty stands for all. CIM-XML
-/// has whole instances, with their classes and those above them and the namespace's name, so that it loads again. Errors:
-/// TZELException of the namespace.
+/// `properties` names those to be written, in their order; if it is empty, all are. CIM-XML always has whole instances, their
+/// classes with all superclasses and the namespace's name, and loads again. Errors: TZELException of the namespace.
 std::string WriteInstances(const TInventory& inventory, const std::vector<boost::shared_ptr<ICIMInstance>>& instances,
-                           const std::vector<std::string>& properties, const std::string& format);
+                           const std::vector<std::string>& properties, EOutputFormat format);
 
 /// The classes of an inventory with the numbers of their instances; in CIM-XML the whole inventory.
-std::string WriteClasses(const TInventory& inventory, const std::string& format);
+std::string WriteClasses(const TInventory& inventory, EOutputFormat format);
 
 }  // namespace NORVZEL20

@@ -1,0 +1,13 @@
+#pragma once
+
+namespace NORVZEL20 {
+
+/// How a result is written.
+enum class EOutputFormat {
+    kText,    ///< for people
+    kJson,    ///< one JSON document
+    kNdjson,  ///< JSON documents, one a line
+    kCimXml   ///< CIM-XML that loads like any inventory
+};
+
+}  // namespace NORVZEL20
