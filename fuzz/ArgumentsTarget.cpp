@@ -1,3 +1,9 @@
+// Runs a command line of the client twice and checks what every command promises.
+//
+// The input is a list of arguments, one a line. The working folder has three inventories ("a", "b", "c") and a rules file ("r").
+// What follows a line "%%" becomes the file "x". The client runs inside this process with a console that keeps what it writes.
+// The status must be 0, 1 or 2, an error must leave no result and no file, and the second run must equal the first.
+
 #include <algorithm>
 #include <mutex>
 #include <vector>
@@ -13,7 +19,7 @@ namespace NORVZEL20 {
 
 namespace {
 
-/// Keeps what a command wrote and said.
+/// Keeps the result and the messages of a command.
 class TKeptConsole : public IConsole {
   public:
     void WriteResult(const std::string& text) override { fResult += text; }
@@ -44,18 +50,18 @@ struct TOutcome {
 std::string Replaced(std::string text, const std::string& from, const std::string& to)
 {
     const std::size_t place = text.find(from);
-    Promise(place != std::string::npos, "the sample holds what is to be replaced", from);
+    Promise(place != std::string::npos, "the sample contains the text to replace", from);
     return text.replace(place, from.size(), to);
 }
 
-/// The same inventory with other values, one instance less and one more.
+/// The sample with other values, one instance less and one more.
 std::string MakeOther()
 {
     const std::string text = Replaced(GetSampleDocument(), "<VALUE>0.25</VALUE>", "<VALUE>0.5</VALUE>");
     return Replaced(text, "<VALUE>sdb\\\"'%_</VALUE>", "<VALUE>sdc</VALUE>");
 }
 
-/// The same inventory under another schema: a class and a property have other names.
+/// The sample under another schema: a class and a property have other names.
 std::string MakeStranger()
 {
     const std::string text = Replaced(GetSampleDocument(), "NAME=\"Temperature\"", "NAME=\"Warmth\"");
@@ -66,26 +72,29 @@ const std::string kRules =
     "<DifftoolSpec version=\"1.0\">\n<class name=\"Device\" default=\"include\" excludekeys=\"Slot\">\n"
     "<excludelist><value>Load</value></excludelist></class>\n<class name=\"Cable\" default=\"include\"/>\n</DifftoolSpec>\n";
 
-/// The arguments stand one a line; what follows the line "%%" becomes the file "x". No argument can name a file elsewhere.
+/// Splits the input into arguments and the file "x". Slashes become underscores, so no argument names a file in another folder.
 void Split(std::string_view input, std::vector<std::string>& arguments, TScratchFolder::TFiles& files)
 {
     const std::size_t end = input.find("\n%%\n");
-    if (end != std::string_view::npos)
+    if (end != std::string_view::npos) {
         files["x"] = input.substr(end + 4);
+    }
     std::string line;
     for (const char letter : std::string(input.substr(0, end)) + "\n") {
-        if (letter == '\n')
+        if (letter == '\n') {
             arguments.push_back(std::exchange(line, std::string()));
-        else if (letter != '\0')
+        } else if (letter != '\0') {
             line += letter == '/' ? '_' : letter;
+        }
     }
 }
 
 TOutcome Run(const std::vector<std::string>& arguments, const TScratchFolder::TFiles& files)
 {
     std::vector<const char*> argv{"cimdelta"};
-    for (const std::string& argument : arguments)
+    for (const std::string& argument : arguments) {
         argv.push_back(argument.c_str());
+    }
     argv.push_back(nullptr);
     TKeptConsole console;
     const TScratchFolder folder(files);
@@ -93,11 +102,11 @@ TOutcome Run(const std::vector<std::string>& arguments, const TScratchFolder::TF
     return {status, console.GetResult(), console.GetSaid(), folder.Read()};
 }
 
-void CheckTrouble(const TOutcome& outcome, const TScratchFolder::TFiles& files)
+void CheckError(const TOutcome& outcome, const TScratchFolder::TFiles& files)
 {
-    Promise(outcome.result.empty(), "trouble writes no result", outcome.result);
-    Promise(!outcome.said.empty(), "trouble is told");
-    Promise(outcome.files == files, "trouble leaves no file behind and changes none");
+    Promise(outcome.result.empty(), "an error writes no result", outcome.result);
+    Promise(!outcome.said.empty(), "an error has a message");
+    Promise(outcome.files == files, "an error leaves no file behind and changes none");
 }
 
 }  // namespace
@@ -111,18 +120,19 @@ void FuzzArguments(std::string_view input)
     Split(input, arguments, files);
     const TOutcome outcome = Run(arguments, files);
     Promise(outcome.status >= 0 && outcome.status <= 2, "the status is 0, 1 or 2", std::to_string(outcome.status));
-    if (outcome.status == 2)
-        CheckTrouble(outcome, files);
+    if (outcome.status == 2) {
+        CheckError(outcome, files);
+    }
     const TOutcome again = Run(arguments, files);
-    Promise(outcome.status == again.status, "the same command ends the same");
-    PromiseEqual(outcome.result, again.result, "the same command writes the same");
-    PromiseEqual(outcome.said, again.said, "the same command says the same");
+    Promise(outcome.status == again.status, "the same command gives the same status");
+    PromiseEqual(outcome.result, again.result, "the same command writes the same result");
+    PromiseEqual(outcome.said, again.said, "the same command writes the same messages");
     Promise(outcome.files == again.files, "the same command leaves the same files");
 }
 
 }  // namespace NORVZEL20
 
-/// A wrapped class and its delta namespace hold each other until the process ends, as documented.
+/// By contract, a class wrapper and its delta namespace own each other until the process ends.
 extern "C" const char* __lsan_default_suppressions()
 {
     return "leak:NORVZEL20::TDeltaNamespace::GetWrappedClass\n";

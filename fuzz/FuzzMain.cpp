@@ -1,4 +1,4 @@
-// The entry that libFuzzer calls; CIMDELTA_FUZZ_FUNCTION is the target that this program was built for.
+// The function that libFuzzer calls for each input. The build defines CIMDELTA_FUZZ_FUNCTION as the target of this program.
 #include <cstddef>
 #include <cstdint>
 

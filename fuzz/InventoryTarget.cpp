@@ -1,3 +1,8 @@
+// Loads a document into a namespace that already holds the sample, once whole and once in small pieces.
+//
+// Both loads must have the same outcome. A refused document must leave the namespace as it was. An accepted one is written, loaded
+// alone into an empty namespace and written again: both texts must be equal, so nothing is lost on the way.
+
 #include <algorithm>
 #include <cstring>
 
@@ -28,14 +33,14 @@ class TSlowSource {
     std::size_t fPiece;
 };
 
-/// The sample before anything is loaded over it.
+/// The sample as a document, before anything is loaded over it.
 const std::string& SampleText()
 {
     static const std::string fgText = WriteDocument(*LoadSample());
     return fgText;
 }
 
-/// The namespace, which held what `before` says, after a load into it, or the error.
+/// Runs `load` and returns the namespace as a document, or the error. `before` is the namespace as it was.
 template <class TLoad>
 std::string Outcome(TInMemNamespace& ns, const std::string& before, TLoad load)
 {
@@ -45,7 +50,7 @@ std::string Outcome(TInMemNamespace& ns, const std::string& before, TLoad load)
         Promise(std::string(error.what()).compare(0, 8, "fuzz.xml") == 0, "an error begins with the document's name", error.what());
         Promise(!error.GetMessage().empty(), "an error has a text");
         PromiseEqual(before, WriteDocument(ns), "a failed load leaves the namespace as it was");
-        // How far the parser has come in text that is no XML depends on the pieces it got.
+        // The position of malformed XML depends on the pieces that the parser got, so only the message is compared.
         return "refused: " + (error.GetMessage().rfind("found malformed XML", 0) == 0 ? error.GetMessage() : error.what());
     }
     return WriteDocument(ns);
@@ -69,13 +74,13 @@ std::string LoadAlone(std::string_view text)
 
 }  // namespace
 
-/// A document is loaded over the sample, whole and in pieces; what loads is written, loaded alone and written again.
 void FuzzInventory(std::string_view input)
 {
     const std::string loaded = LoadWhole(LoadSample(), SampleText(), input);
-    PromiseEqual(loaded, LoadPieces(LoadSample(), SampleText(), input), "a document means the same whole and in pieces");
-    if (loaded.compare(0, 9, "refused: ") != 0)
-        PromiseEqual(loaded, LoadAlone(loaded), "what is written loads as it was");
+    PromiseEqual(loaded, LoadPieces(LoadSample(), SampleText(), input), "a document loads the same whole and in pieces");
+    if (loaded.compare(0, 9, "refused: ") != 0) {
+        PromiseEqual(loaded, LoadAlone(loaded), "a written document loads as it was");
+    }
 }
 
 }  // namespace NORVZEL20

@@ -1,3 +1,8 @@
+// Parses a text as an object path, without a namespace and with the sample's.
+//
+// The namespace must not decide whether the text is a path. The text of a parsed path must parse to the same path again. Looking
+// the path up in the sample must find an instance, find nothing, or fail with a documented status.
+
 #include "fuzz/Promise.h"
 #include "fuzz/SampleInventory.h"
 #include "fuzz/TFuzzTarget.h"
@@ -8,7 +13,7 @@ namespace NORVZEL20 {
 
 namespace {
 
-/// Parses the text; false where it is no path.
+/// Parses the text. Returns false if it is no path.
 bool Parse(const std::string& text, const boost::shared_ptr<ICIMNamespace>& ns, TCIMReference& path)
 {
     std::size_t position = std::string::npos;
@@ -16,7 +21,8 @@ bool Parse(const std::string& text, const boost::shared_ptr<ICIMNamespace>& ns, 
         path = TCIMReference::Parse(text, ns, &position);
         return true;
     } catch (const TZELException& error) {
-        Promise(error.GetStatusCode().GetStatus() == TZELStatusCode::kParseError, "what is no path is refused with status 9");
+        Promise(error.GetStatusCode().GetStatus() == TZELStatusCode::kParseError,
+                "a text that is no path is refused with kParseError (9)");
         Promise(position <= text.size(), "the position of an error lies in the text", std::to_string(position));
         return false;
     }
@@ -29,7 +35,7 @@ std::string KeyText(const TCIMValue& value)
     return text;
 }
 
-/// The path's text reads back as the same path. Types do not show in it: a real without a fraction comes back as an integer.
+/// The path's text parses to the same path. The text does not hold types: a real without a fraction comes back as an integer.
 void CheckRoundTrip(const TCIMReference& path)
 {
     const std::string text = path.GetPath();
@@ -47,15 +53,15 @@ void CheckRoundTrip(const TCIMReference& path)
     Promise(path.GetKeyCount() == again.GetKeyCount(), "no binding is added");
 }
 
-/// A path of the sample finds what it names or is refused, whatever its keys are.
+/// Looking up any path finds an instance or nothing, or fails with a documented status.
 void CheckLookUp(TInMemNamespace& ns, const TCIMReference& path)
 {
     try {
         ns.FindInstance(path);
     } catch (const TZELException& error) {
         const int status = error.GetStatusCode().GetStatus();
-        Promise(status == TZELStatusCode::kTypeMismatch || status == TZELStatusCode::kKeyMissing, "a look-up tells why it fails",
-                std::to_string(status));
+        Promise(status == TZELStatusCode::kTypeMismatch || status == TZELStatusCode::kKeyMissing,
+                "a look-up fails with kTypeMismatch (13) or kKeyMissing (14)", std::to_string(status));
     }
 }
 
@@ -69,8 +75,9 @@ void FuzzPath(std::string_view input)
     TCIMReference placed;
     const bool isPath = Parse(text, boost::shared_ptr<ICIMNamespace>(), alone);
     Promise(Parse(text, fgSample, placed) == isPath, "whether a text is a path does not depend on the namespace");
-    if (!isPath)
+    if (!isPath) {
         return;
+    }
     CheckRoundTrip(alone);
     CheckRoundTrip(placed);
     CheckLookUp(*fgSample, alone);

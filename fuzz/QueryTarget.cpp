@@ -1,3 +1,9 @@
+// Runs a text as a query, and as the condition of a query, over the sample.
+//
+// A condition is checked by its logic, so no expected answer is needed: the condition and its NOT share no instance, NOT NOT gives
+// the condition back, OR of both gives the union of both answers, AND of both gives nothing. (A NULL makes a test neither true nor
+// false, so a condition and its NOT together need not find every instance.)
+
 #include <algorithm>
 #include <iterator>
 #include <set>
@@ -29,8 +35,8 @@ TAnswer Ask(TInMemNamespace& ns, const std::string& text)
         answer.answered = true;
     } catch (const TQueryError& error) {
         const int status = error.GetStatusCode().GetStatus();
-        Promise(status == TZELStatusCode::kInvalidQuery || status == TZELStatusCode::kNotFound, "a query is refused with 15 or 16",
-                std::to_string(status));
+        Promise(status == TZELStatusCode::kInvalidQuery || status == TZELStatusCode::kNotFound,
+                "a query is refused with kNotFound (15) or kInvalidQuery (16)", std::to_string(status));
         Promise(error.GetPosition() <= text.size(), "the position of an error lies in the text", error.what());
     }
     return answer;
@@ -43,21 +49,22 @@ bool AreDisjoint(const TPaths& left, const TPaths& right)
     return common.empty();
 }
 
-/// What a condition finds, its NOT does not find, and either way round the parentheses change nothing.
+/// Checks the condition against its negations, as described above.
 void CheckCondition(TInMemNamespace& ns, const std::string& condition)
 {
     const std::string start = "SELECT * FROM Device WHERE ";
     const TAnswer found = Ask(ns, start + condition);
-    if (!found.answered)
+    if (!found.answered) {
         return;
-    const TAnswer denied = Ask(ns, start + "NOT (" + condition + ")");
-    Promise(denied.answered, "a condition can be denied", condition);
-    Promise(AreDisjoint(found.paths, denied.paths), "nothing answers a condition and its denial", condition);
+    }
+    const TAnswer negated = Ask(ns, start + "NOT (" + condition + ")");
+    Promise(negated.answered, "a condition can be negated", condition);
+    Promise(AreDisjoint(found.paths, negated.paths), "no instance answers a condition and its NOT", condition);
     const TAnswer twice = Ask(ns, start + "NOT NOT (" + condition + ")");
-    Promise(twice.answered && twice.paths == found.paths, "a denial denied is the condition", condition);
+    Promise(twice.answered && twice.paths == found.paths, "NOT NOT gives the condition back", condition);
     const TAnswer either = Ask(ns, start + "(" + condition + ") OR NOT (" + condition + ")");
     TPaths both = found.paths;
-    both.insert(denied.paths.begin(), denied.paths.end());
+    both.insert(negated.paths.begin(), negated.paths.end());
     Promise(either.answered && either.paths == both, "OR finds what either side finds", condition);
     const TAnswer neither = Ask(ns, start + "(" + condition + ") AND NOT (" + condition + ")");
     Promise(neither.answered && neither.paths.empty(), "AND finds what both sides find", condition);
@@ -68,11 +75,12 @@ void CheckCondition(TInMemNamespace& ns, const std::string& condition)
 void FuzzQuery(std::string_view input)
 {
     static const boost::shared_ptr<TInMemNamespace> fgSample = LoadSample();
-    constexpr std::size_t kMostConditionBytes = 300;  // a condition is repeated, and its depth is bounded
+    constexpr std::size_t kMostConditionBytes = 300;  // the condition is repeated in one query, whose depth is bounded
     const std::string text(input);
     Ask(*fgSample, text);
-    if (text.size() <= kMostConditionBytes)
+    if (text.size() <= kMostConditionBytes) {
         CheckCondition(*fgSample, text);
+    }
 }
 
 }  // namespace NORVZEL20

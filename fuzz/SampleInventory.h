@@ -7,13 +7,13 @@
 
 namespace NORVZEL20 {
 
-/// A small CIM-XML document with something of everything: types, arrays, keys, inheritance, an association, embedded objects.
+/// A small CIM-XML document with every kind of element: all types, arrays, keys, inheritance, an association, embedded objects.
 const std::string& GetSampleDocument();
 
 /// A new namespace that holds the sample document.
 boost::shared_ptr<TInMemNamespace> LoadSample();
 
-/// The namespace as one CIM-XML document.
+/// Writes the namespace as one CIM-XML document.
 std::string WriteDocument(ICIMNamespace& ns);
 
 }  // namespace NORVZEL20

@@ -1,3 +1,8 @@
+// Reads a text as a specification file, twice, against the schema of the sample.
+//
+// An accepted file must give rules for classes of the schema and log nothing. A refused file must throw kParseError (9) and log the
+// reason with its line. Both readings must give the same rules.
+
 #include <algorithm>
 
 #include "fuzz/Promise.h"
@@ -12,7 +17,7 @@ namespace NORVZEL20 {
 namespace {
 
 struct TOutcome {
-    std::string rules;  ///< empty where the text was refused
+    std::string rules;  ///< empty if the text was refused
     std::vector<std::string> log;
     int status = 0;
 };
@@ -21,7 +26,8 @@ void CheckRules(ICIMNamespace& schema, const std::string& className, TCIMDiffEng
 {
     Promise(schema.GetClass(className, TCallContext())->GetName(TCallContext()).size() == className.size(),
             "rules are for classes of the schema");
-    Promise(rules.fDefault == TCIMDiffEngine::INCLUDE || rules.fDefault == TCIMDiffEngine::EXCLUDE, "a default is one of two");
+    Promise(rules.fDefault == TCIMDiffEngine::INCLUDE || rules.fDefault == TCIMDiffEngine::EXCLUDE,
+            "a default is include or exclude");
     for (const std::string& key : rules.fExcludedKeys) {
         Promise(!key.empty() && key.find_first_of(" \t\r\n\v\f") == std::string::npos, "keys are separated by blanks");
         Promise(rules.isKeyExcluded(key) && rules.hasExcludedKeys(), "an excluded key is known as one");
@@ -34,10 +40,12 @@ std::string Describe(ICIMNamespace& schema, TCIMDiffEngine::TRuleset ruleset)
     for (const auto& [className, rules] : ruleset.fRules) {
         CheckRules(schema, className, *rules);
         text += className + " " + TCIMDiffEngine::strPropType(rules->fDefault) + "\n";
-        for (const auto& [property, treatment] : rules->fProperties)
+        for (const auto& [property, treatment] : rules->fProperties) {
             text += "  " + property + " " + TCIMDiffEngine::strPropType(treatment) + "\n";
-        for (const std::string& key : rules->fExcludedKeys)
+        }
+        for (const std::string& key : rules->fExcludedKeys) {
             text += "  without " + key + "\n";
+        }
     }
     return text;
 }
@@ -62,13 +70,13 @@ bool StartsWith(const std::string& text, const std::string& start)
     return text.compare(0, start.size(), start) == 0;
 }
 
-/// An error of the grammar is logged twice, that of the document itself once.
+/// An error in a tag is logged twice, an error of the document once.
 void CheckRefusal(const TOutcome& outcome)
 {
-    Promise(outcome.status == TZELStatusCode::kParseError, "what is refused is refused with status 9");
+    Promise(outcome.status == TZELStatusCode::kParseError, "a refused text has the status kParseError (9)");
     Promise(outcome.log.size() == 1 || outcome.log.size() == 2, "a refusal is logged once or twice");
-    Promise(StartsWith(outcome.log[0], "Diff-XML Parser line "), "the first entry tells the line", outcome.log[0]);
-    Promise(outcome.log.size() == 1 || StartsWith(outcome.log[1], "TDiffXMLParser: Thr"), "the second entry tells the event",
+    Promise(StartsWith(outcome.log[0], "Diff-XML Parser line "), "the first entry has the line", outcome.log[0]);
+    Promise(outcome.log.size() == 1 || StartsWith(outcome.log[1], "TDiffXMLParser: Thr"), "the second entry names the kind of tag",
             outcome.log.back());
 }
 
@@ -78,10 +86,11 @@ void FuzzSpecification(std::string_view input)
 {
     static const boost::shared_ptr<ICIMNamespace> fgSchema = LoadSample();
     const TOutcome outcome = Read(fgSchema, std::string(input));
-    if (outcome.rules.empty())
+    if (outcome.rules.empty()) {
         CheckRefusal(outcome);
-    else
-        Promise(outcome.log.empty(), "what is accepted is not logged");
+    } else {
+        Promise(outcome.log.empty(), "an accepted text logs nothing");
+    }
     PromiseEqual(outcome.rules, Read(fgSchema, std::string(input)).rules, "the same text gives the same rules");
 }
 

@@ -7,9 +7,9 @@ namespace NORVZEL20 {
 
 /// A function that takes any bytes, runs one part of the system over them and checks what that part promises.
 ///
-/// Throws TBrokenPromise where a promise was broken; any other exception is a finding too. Equal bytes do the same again.
+/// Throws TBrokenPromise if a promise was broken; any other exception is a finding too. The same bytes give the same outcome.
 struct TFuzzTarget {
-    const char* name;  ///< also that of its folders below corpus/ and found/ and of its dictionary
+    const char* name;  ///< also the name of its folders in corpus/ and found/ and of its dictionary
     void (*run)(std::string_view input);
 
     /// All targets, in the order of their names.
@@ -17,7 +17,7 @@ struct TFuzzTarget {
 };
 
 void FuzzArguments(std::string_view input);      ///< a command line of the client, one argument a line
-void FuzzEngine(std::string_view input);         ///< bytes that namespaces and rules are made from
+void FuzzEngine(std::string_view input);         ///< throws of dice, from which namespaces and rules are made
 void FuzzInventory(std::string_view input);      ///< a CIM-XML document
 void FuzzPath(std::string_view input);           ///< the text of an object path
 void FuzzQuery(std::string_view input);          ///< a whole query, or the condition of one

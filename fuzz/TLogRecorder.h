@@ -8,7 +8,7 @@
 
 namespace NORVZEL20 {
 
-/// Takes the core log while it lives, so that targets are quiet and can check what was logged.
+/// Receives the entries of the core log while it lives. Nothing is printed, and a target can check what was logged.
 class TLogRecorder : public ILogger {
   public:
     TLogRecorder() : fBefore(TCoreLog::Set(this)) {}

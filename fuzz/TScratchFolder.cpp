@@ -15,11 +15,12 @@ namespace {
 
 void Require(bool succeeded, const char* what)
 {
-    if (!succeeded)
+    if (!succeeded) {
         throw std::system_error(errno, std::generic_category(), what);
+    }
 }
 
-/// Made once, and taken away when the process ends.
+/// The one folder of the process: made on first use and removed when the process ends.
 class TFolder {
   public:
     TFolder()
@@ -42,8 +43,9 @@ class TFolder {
 
     void Empty() const
     {
-        for (const auto& entry : std::filesystem::directory_iterator(fPath))
+        for (const auto& entry : std::filesystem::directory_iterator(fPath)) {
             std::filesystem::remove_all(entry.path());
+        }
     }
 
     const std::string& GetPath() const { return fPath; }
@@ -63,15 +65,17 @@ const TFolder& GetFolder()
 TScratchFolder::TScratchFolder(const TFiles& files) : fBefore(open(".", O_RDONLY | O_DIRECTORY | O_CLOEXEC))
 {
     GetFolder().Empty();
-    for (const auto& [name, content] : files)
+    for (const auto& [name, content] : files) {
         std::ofstream(GetFolder().GetPath() + "/" + name, std::ios::binary) << content;
+    }
     Require(fBefore >= 0 && chdir(GetFolder().GetPath().c_str()) == 0, "working folder");
 }
 
 TScratchFolder::~TScratchFolder()
 {
-    if (fchdir(fBefore) != 0)
-        std::abort();  // nothing below would find its files again
+    if (fchdir(fBefore) != 0) {
+        std::abort();  // the next input would run in the wrong folder
+    }
     close(fBefore);
 }
 

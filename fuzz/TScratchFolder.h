@@ -5,9 +5,10 @@
 
 namespace NORVZEL20 {
 
-/// An empty folder that is the process's working folder, and the place of its temporary files, while this lives.
+/// A folder with the given files, which is the process's working folder while this lives. Temporary files go there too.
 ///
-/// The folder is one for the whole process; standard input is empty from the first one on.
+/// All objects use the same folder and empty it first, so only one may live at a time. The first one also makes standard input
+/// empty for the rest of the process.
 class TScratchFolder {
   public:
     using TFiles = std::map<std::string, std::string>;  ///< contents by name
@@ -17,7 +18,7 @@ class TScratchFolder {
     TScratchFolder& operator=(const TScratchFolder&) = delete;
     ~TScratchFolder();
 
-    /// What the folder holds now.
+    /// The files that are in the folder now.
     TFiles Read() const;
 
   private:

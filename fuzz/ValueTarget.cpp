@@ -1,3 +1,8 @@
+// Parses a text as a value of every type, and as a datetime.
+//
+// The text of a parsed value must parse to an equal value and then be the same text. Converting a number to another type and back
+// must not change it. The text of a path that has the value as its key must parse to the same path.
+
 #include "embedded/value/TValueText.h"
 #include "fuzz/Promise.h"
 #include "fuzz/TFuzzTarget.h"
@@ -16,38 +21,40 @@ bool IsNumber(TType type)
     return type >= TType::kUint8 && type <= TType::kReal64;
 }
 
-/// What is read writes itself as a text that reads back as the same value.
+/// The text of a parsed value parses to the same value.
 void CheckText(TType type, const TCIMValue& value)
 {
-    Promise(value.GetType() == type && !value.IsNull(), "a value read has the type asked for");
+    Promise(value.GetType() == type && !value.IsNull(), "a parsed value has the type asked for");
     Promise(value == value && value.Hash() == TCIMValue(value).Hash(), "a value equals itself");
     std::string text;
     TValueText::AppendPlain(text, value);
     TCIMValue again;
-    Promise(TValueText::Parse(type, text, again), "a value's text can be read", text);
-    Promise(again == value && again.Hash() == value.Hash(), "a value's text reads as the value", text);
+    Promise(TValueText::Parse(type, text, again), "a value's text can be parsed", text);
+    Promise(again == value && again.Hash() == value.Hash(), "a value's text parses to the value", text);
     std::string second;
     TValueText::AppendPlain(second, again);
     PromiseEqual(text, second, "a value's text is a fixed point");
     Promise(!value.ToText().empty() || type == TType::kString, "a value has a text for people");
 }
 
-/// A conversion loses nothing: numbers come back, whatever they were turned into on the way.
+/// A number that is converted to another type and back is the same number.
 void CheckConversions(const TCIMValue& value)
 {
     for (unsigned char code = TType::kBoolean; code <= TType::kReference; ++code) {
         const TType type(static_cast<TType::ECIMType>(code));
         TCIMValue converted;
-        if (!TValueText::Convert(value, type, converted))
+        if (!TValueText::Convert(value, type, converted)) {
             continue;
+        }
         Promise(converted.GetType() == type, "a converted value has the type asked for");
         TCIMValue back;
-        if (IsNumber(value.GetType()) && IsNumber(type) && TValueText::Convert(converted, value.GetType(), back))
+        if (IsNumber(value.GetType()) && IsNumber(type) && TValueText::Convert(converted, value.GetType(), back)) {
             Promise(back == value, "a conversion loses nothing", value.ToText() + " became " + back.ToText());
+        }
     }
 }
 
-/// The text as the only key of a path reads back as it is.
+/// The text of a path with the value as its only key parses to the same path.
 void CheckKeyText(const TCIMValue& value)
 {
     TCIMReference path;
@@ -61,9 +68,10 @@ void CheckKeyText(const TCIMValue& value)
 void CheckDateTime(std::string_view text)
 {
     TCIMDateTime value;
-    if (!TCIMDateTime::Parse(text, value))
+    if (!TCIMDateTime::Parse(text, value)) {
         return;
-    // The one offset that is written in two ways.
+    }
+    // The offset zero can be written in two ways.
     const std::string kept(text);
     const bool isMinusZero = kept.substr(kept.size() - 4) == "-000";
     PromiseEqual(isMinusZero ? kept.substr(0, kept.size() - 4) + "+000" : kept, value.ToText(), "a datetime keeps its text");

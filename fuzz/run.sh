@@ -1,6 +1,6 @@
 #!/usr/bin/env bash
-# fuzz/run.sh BIN SECONDS [TARGET...]: runs each fuzz target for SECONDS, two at a time, and tells what came of it.
-# Inputs that a run adds to its corpus stay in BIN/../corpus; findings go to fuzz/found/TARGET. Ends with 1 where there was one.
+# fuzz/run.sh BIN SECONDS [TARGET...]: runs each fuzz target for SECONDS, two at a time, and prints the outcomes.
+# A run keeps new inputs in BIN/../corpus and findings in fuzz/found/TARGET. Ends with status 1 if there was a finding.
 set -euo pipefail
 bin=$(cd "${1:?folder of the fuzz programs}" && pwd)
 seconds=${2:?seconds for each target}
@@ -19,7 +19,7 @@ run_target() {
     local target=$1 status=0 dictionary=()
     mkdir -p "$work/$target" "found/$target"
     [ ! -f "dictionaries/$target.dict" ] || dictionary=("-dict=dictionaries/$target.dict")
-    # Without the entropic schedule, whose bookkeeping takes most of the time where an input has thousands of features.
+    # Without the entropic schedule: its bookkeeping takes most of the time if an input has thousands of features.
     "$bin/fuzz_$target" -entropic=0 -max_total_time="$seconds" -timeout=20 -rss_limit_mb=3000 -max_len=8192 -print_final_stats=1 \
         -artifact_prefix="$findings/$target/" "${dictionary[@]}" "$work/$target" "corpus/$target" >"$logs/$target" 2>&1 || status=$?
     rmdir --ignore-fail-on-non-empty "found/$target"

@@ -1,4 +1,7 @@
 // Replays every input of the fuzzers: those written by hand, and those that once broke something.
+//
+// Each fuzz target is a function that throws if a promise is broken, so the tests call it with the content of each file. A target
+// without seeds fails, and so does a folder of findings that belongs to no target.
 #include <gtest/gtest.h>
 
 #include <algorithm>
@@ -21,8 +24,9 @@ const TFolder kFuzzFolder = CIMDELTA_FUZZ_FOLDER;
 std::vector<TFolder> FilesIn(const TFolder& folder)
 {
     std::vector<TFolder> files;
-    for (const auto& entry : std::filesystem::directory_iterator(folder))
+    for (const auto& entry : std::filesystem::directory_iterator(folder)) {
         files.push_back(entry.path());
+    }
     std::sort(files.begin(), files.end());
     return files;
 }
@@ -34,7 +38,7 @@ std::string ContentOf(const TFolder& file)
     return std::string(std::istreambuf_iterator<char>(stream), std::istreambuf_iterator<char>());
 }
 
-/// What happened: "held", or the promise that was broken.
+/// Returns "held", or the promise that was broken.
 std::string Replay(const TFuzzTarget& target, const std::string& input)
 {
     try {
@@ -55,11 +59,13 @@ class ReplayTest : public testing::TestWithParam<TFuzzTarget> {
     std::size_t ReplayAll(const std::string& kind)
     {
         const TFolder folder = kFuzzFolder / kind / GetParam().name;
-        if (!std::filesystem::exists(folder))
+        if (!std::filesystem::exists(folder)) {
             return 0;
+        }
         const std::vector<TFolder> files = FilesIn(folder);
-        for (const TFolder& file : files)
+        for (const TFolder& file : files) {
             EXPECT_EQ("held", Replay(GetParam(), ContentOf(file))) << file;
+        }
         return files.size();
     }
 };
@@ -76,17 +82,18 @@ TEST_P(ReplayTest, FindingsKeepEveryPromise)
     ReplayAll("found");
 }
 
-/// An empty and a short input of each byte: what a fuzzer tries first.
+/// The empty input and each single byte, which a fuzzer tries first.
 TEST_P(ReplayTest, SingleBytesKeepEveryPromise)
 {
     EXPECT_EQ("held", Replay(GetParam(), std::string()));
-    for (int byte = 0; byte < 256; ++byte)
+    for (int byte = 0; byte < 256; ++byte) {
         EXPECT_EQ("held", Replay(GetParam(), std::string(1, static_cast<char>(byte)))) << byte;
+    }
 }
 
 INSTANTIATE_TEST_SUITE_P(Targets, ReplayTest, testing::ValuesIn(TFuzzTarget::GetAll()), NameOf);
 
-/// Every folder of findings belongs to a target, so that none is left out, and the folder itself is there.
+/// A folder of findings that belongs to no target would be replayed by no test.
 TEST(FindingsTest, EveryFindingIsReplayed)
 {
     std::size_t findings = 0;
