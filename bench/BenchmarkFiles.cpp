@@ -11,7 +11,7 @@
 namespace NORVZEL20 {
 namespace {
 
-// The comparison needs the class that tells one operating system from another, as real inventories have it.
+// Every comparison reads the type of the operating system first, so an inventory needs an instance of this class.
 std::string WithOperatingSystem(const std::string& xml)
 {
     static const std::string kEnd = "</DECLGROUP>";
@@ -25,6 +25,7 @@ std::string WithOperatingSystem(const std::string& xml)
     return result.insert(result.rfind(kEnd), kOperatingSystem);
 }
 
+// A temporary file with the rules, removed when the process ends.
 struct TRulesFile {
     TRulesFile()
     {

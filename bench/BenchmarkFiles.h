@@ -4,14 +4,14 @@
 
 namespace NORVZEL20 {
 
-/// How many instances each inventory of the benchmarks has.
+/// The number of instances in each inventory of the benchmarks.
 constexpr unsigned int kBenchInstances = 100000;
 
-/// The two states of the generated inventory, made on first use and kept in memory.
+/// The two states of the generated inventory as CIM-XML, made on first use and kept in memory.
 const std::string& FirstState();
 const std::string& SecondState();
 
-/// A comparison specification, in a file that is removed at exit, which includes every property of the generated class.
+/// The path of a specification file that includes every property of the generated class. The file is removed at exit.
 const std::string& RulesFile();
 
 }  // namespace NORVZEL20

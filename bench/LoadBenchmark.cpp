@@ -1,4 +1,7 @@
-// Loading an inventory, beside the bare XML parsers on the same bytes.
+// How long an inventory takes to load, beside bare XML parsers on the same bytes.
+//
+// Expat is the parser that the host uses. Here its handlers do nothing, so its time is the least that loading can take; the figure
+// to watch is the ratio of the two. libxml2 is there for comparison. The memory of the loaded namespace is the growth of the heap.
 
 #include <benchmark/benchmark.h>
 #include <expat.h>
@@ -27,7 +30,6 @@ std::size_t HeapInUse()
     return heap.uordblks + heap.hblkhd;
 }
 
-// The parser that the host uses, with handlers that do nothing: the floor.
 void BM_ExpatEmptyHandlers(benchmark::State& state)
 {
     const std::string& xml = FirstState();

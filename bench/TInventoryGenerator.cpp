@@ -1,3 +1,12 @@
+// Generates the inventories of the benchmarks.
+//
+// Every value is a function of the seed, the number of its instance and its property: a hash of the three is the random number from
+// which the value is made. So no state is kept, instances can be written in any order, and equal arguments give equal bytes
+// everywhere.
+//
+// The second state is written by the same functions. Another hash decides which values change (1 %), which instances are left out
+// (0.5 %) and after which ones a new instance follows (0.5 %).
+
 #include "bench/TInventoryGenerator.h"
 
 #include <array>
@@ -22,6 +31,7 @@ enum EProperty : unsigned int {
 
 constexpr std::uint64_t kPerMille = 1000;
 
+// A hash whose output bits all depend on all input bits.
 std::uint64_t Mix(std::uint64_t value)
 {
     value += 0x9e3779b97f4a7c15U;
