@@ -1,4 +1,4 @@
-# What our own code is held to; linked privately, so that it reaches nobody who uses the libraries.
+# The warnings for our own code. Targets link this privately, so users of the libraries do not get the options.
 add_library(cimdelta_warnings INTERFACE)
 target_compile_options(cimdelta_warnings INTERFACE -Wall -Wextra -Wpedantic -Wshadow -Wconversion -Wnon-virtual-dtor)
 if(CIMDELTA_SANITIZE AND CMAKE_CXX_COMPILER_ID STREQUAL "GNU")

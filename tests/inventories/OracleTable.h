@@ -5,11 +5,11 @@
 
 namespace NORVZEL20 {
 
-/// The differences of two inventories as a program that knows nothing of this one lists them, a line each:
-/// "A_ONLY path", "B_ONLY path", "DIFF path property: old -> new".
+/// Reads the differences of two inventories, a line each: "A_ONLY path", "B_ONLY path", "DIFF path property: old -> new".
 ///
-/// Reads a tab-separated file, compressed or not. Rows whose note says that the values are equal as we understand it (the same bag
-/// in another order, the same object named with its namespace) are left out. `withValues` off leaves out ": old -> new".
+/// The file is tab-separated, compressed or not, and was written by a program that shares nothing with this one. Rows are left out
+/// if their note says that the values are equal here: the same elements of a bag in another order (unless `ordered` names the
+/// property), or the same object named with its namespace. Without `withValues` the lines end before ": old -> new".
 std::set<std::string> ReadOracle(const std::string& path, const std::set<std::string>& ordered, bool withValues);
 
 }  // namespace NORVZEL20

@@ -1,4 +1,7 @@
 // Real inventories, compared by the plug-in and by a program that shares nothing with it.
+//
+// The other program wrote its differences into the oracle files beside the inventories. The plug-in must find the same ones, except
+// for pairs of values that are equal in CIM although their texts differ; those are listed one by one.
 
 #include <gtest/gtest.h>
 
@@ -13,7 +16,7 @@ namespace {
 
 const std::string kData = TEST_DATA;
 
-// The first lines that only one of the sides has, which is what a person wants to see of two sets of 28,000.
+// The first ten lines that are in one of the sets only; the sets have up to 28,000 lines.
 std::string Unmatched(const std::set<std::string>& expected, const std::set<std::string>& found)
 {
     std::vector<std::string> lines;
@@ -60,8 +63,8 @@ INSTANTIATE_TEST_SUITE_P(PackageIndexAndTypes, LosslessTest,
                          testing::Values("/pair/a.xml.xz", "/pair/b.xml.xz", "/pair/c.xml.xz", "/typepair/A.xml",
                                          "/typepair/B.xml"));
 
-// The list compares texts. Here 0 equals -0, a real32 is what 32 bits hold of it, a datetime is an instant whatever its offset, and
-// the name of an embedded object's class has no letter case.
+// The other program compares texts. Here 0 equals -0, a real32 has 32 bits, datetimes are compared as instants whatever their
+// offset, and letter case does not count in the class name of an embedded object.
 const std::set<std::string> kEqualInValue = {
     "DIFF TST_AllTypes.Id=\"case-198\" p_real64", "DIFF TST_AllTypes.Id=\"case-205\" p_real32",
     "DIFF TST_AllTypes.Id=\"case-206\" p_datetime", "DIFF TST_AllTypes.Id=\"case-215\" e_inst"};

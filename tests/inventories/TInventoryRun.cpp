@@ -21,7 +21,7 @@ namespace {
 
 using TJson = nlohmann::json;
 
-// Every comparison looks at the operating systems first; these inventories come without.
+// Every comparison reads the type of the operating system first. These inventories have no such instance, so one is added.
 const char kOperatingSystem[] =
     "<CIM CIMVERSION=\"2.0\" DTDVERSION=\"2.0\"><DECLARATION><DECLGROUP><VALUE.OBJECT><CLASS NAME=\"KALMO_OperatingSystem\">"
     "<PROPERTY NAME=\"Name\" TYPE=\"string\"><QUALIFIER NAME=\"Key\" TYPE=\"boolean\"><VALUE>TRUE</VALUE></QUALIFIER></PROPERTY>"

@@ -10,12 +10,14 @@
 
 namespace NORVZEL20 {
 
-/// The inventory in a file, compressed or not, or in a text; and the text of one.
+/// Loads the inventory in a file, compressed or not.
 boost::shared_ptr<TInMemNamespace> LoadInventory(const std::string& path);
+/// Loads the inventory in a text.
 boost::shared_ptr<TInMemNamespace> LoadInventoryText(const std::string& xml);
+/// Writes the namespace as one CIM-XML document.
 std::string WriteInventory(TInMemNamespace& ns);
 
-/// A comparison of two inventory files through the plug-in, told as lines like those of ReadOracle.
+/// A comparison of two inventory files through the plug-in, whose result has the form of ReadOracle.
 class TInventoryRun {
   public:
     TInventoryRun(const std::string& reference, const std::string& other);
@@ -23,6 +25,7 @@ class TInventoryRun {
     /// Compares every property of the named classes.
     void Compare(const std::vector<std::string>& classes);
 
+    /// The differences, a line each; see ReadOracle.
     std::set<std::string> Differences(bool withValues) const;
 
   private:

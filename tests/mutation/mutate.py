@@ -3,9 +3,9 @@
 
 Usage: mutate.py [--limit N] [--seed N] [--jobs N] [--only PATH-PREFIX] [--report FILE]
 
-Works on copies of the tree below build/mutate, one for each job. A mutant is killed when a test fails or crashes, and counted apart when one runs
-too long; one that does not compile is no mutant. Survivors that are known to change nothing stand in accepted.tsv (path, text before, text after,
-reason); any other makes the run fail, and so does a build that fails without an error of the compiler or the linker.
+Works on copies of the tree below build/mutate, one for each job. A mutant is killed if a test fails or crashes. It is counted separately if a test runs too
+long, and not at all if it does not compile. Survivors that are known to change nothing are in accepted.tsv (path, text before, text after, reason). Any other
+survivor makes the run fail, and so does a build that fails without an error of the compiler or the linker.
 """
 import argparse
 import csv
@@ -24,7 +24,7 @@ from operators import mutants_of
 
 ROOT = pathlib.Path(__file__).resolve().parents[2]
 FOLDERS = ("provider", "spec", "engine")
-# The quick ones; of those that make allocations fail, the ones that no other test stands in for.
+# The quick programs, and of the tests that make allocations fail only those that no quick test replaces.
 TESTS = {"tests_spec": "*", "tests_engine": "*", "tests_provider": "*", "tests_provider_start": "*", "tests_host_process": "*",
          "tests_faults": "Faults/OutOfMemory.*"}
 TEST_SECONDS = 60
@@ -35,7 +35,7 @@ class BuildFailure(Exception):
 
 
 def run(command, folder, seconds=None):
-    """How the command ended (None where it took too long), and what it printed."""
+    """Runs the command. Returns its exit status (None if it took too long) and what it printed."""
     environment = dict(os.environ, CIMDELTA_ROOT=str(folder), CCACHE_BASEDIR=str(folder), CCACHE_NOHASHDIR="1")
     try:
         result = subprocess.run(command, cwd=folder, env=environment, timeout=seconds, stdout=subprocess.PIPE, stderr=subprocess.STDOUT)
@@ -45,7 +45,7 @@ def run(command, folder, seconds=None):
 
 
 class Workshop:
-    """A copy of the tree, built once, in which mutants are tried one after the other."""
+    """A copy of the tree, built once, for trying mutants one after the other."""
 
     def __init__(self, number):
         self.folder = ROOT / "build" / "mutate" / str(number)
@@ -131,10 +131,10 @@ def try_all(mutants, jobs):
 
 def main():
     parser = argparse.ArgumentParser()
-    parser.add_argument("--limit", type=int, default=0, help="try so many mutants, chosen at random (default: all)")
+    parser.add_argument("--limit", type=int, default=0, help="try this many mutants, chosen at random (default: all)")
     parser.add_argument("--seed", type=int, default=1)
     parser.add_argument("--jobs", type=int, default=os.cpu_count())
-    parser.add_argument("--only", default="", help="a path's beginning")
+    parser.add_argument("--only", default="", help="the beginning of a path: try only mutants of such files")
     parser.add_argument("--report", default=str(ROOT / "build" / "mutate" / "report.tsv"))
     options = parser.parse_args()
 

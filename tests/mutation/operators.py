@@ -12,7 +12,7 @@ class Mutant:
     after: str
 
     def key(self):
-        """What an accepted survivor is recognised by: the text and the change, not the line's number."""
+        """Identifies an accepted survivor by its text and change, not by its line number."""
         return (self.path, self.before.strip(), self.after.strip())
 
 
@@ -82,7 +82,7 @@ OPERATORS = {
     "swapped arguments": swapped_arguments,
     "text": changed_texts,
 }
-# A declaration changed on its own does not compile; values do.
+# In headers only values are changed: a changed declaration would not compile.
 HEADER_OPERATORS = ("number plus one", "status", "true to false", "false to true", "text")
 
 
