@@ -1,4 +1,5 @@
 #include "engine/TCIMDiffEngine.h"
+#include "provider/DeltaNames.h"
 #include "provider/TDeltaClass.h"
 
 namespace NORVZEL20 {
@@ -37,16 +38,16 @@ boost::shared_ptr<ICIMInstance> TCIMDiffEngine::AllocateRecord(const std::string
 void TCIMDiffEngine::createCIMDiff(boost::shared_ptr<ICIMInstance> deltaClassRecord, TDeltaNamespace::EDeltaType type,
                                    std::string instanceName, std::string propertyName, std::vector<int> namespaceIndices)
 {
-    const boost::shared_ptr<ICIMInstance> delta = AllocateRecord("KALMO_Delta");
-    SetProperty(*delta, "Type", TCIMValue(static_cast<unsigned char>(type)));
-    SetProperty(*delta, "InstanceName", TCIMValue(instanceName));
-    SetProperty(*delta, "Property", TCIMValue(propertyName));
-    SetProperty(*delta, "NamespaceIndices", MakeIndexArray(namespaceIndices));
+    const boost::shared_ptr<ICIMInstance> delta = AllocateRecord(kDeltaRecord);
+    SetProperty(*delta, kDeltaRecordType, TCIMValue(static_cast<unsigned char>(type)));
+    SetProperty(*delta, kDeltaRecordInstance, TCIMValue(instanceName));
+    SetProperty(*delta, kDeltaRecordProperty, TCIMValue(propertyName));
+    SetProperty(*delta, kDeltaRecordIndices, MakeIndexArray(namespaceIndices));
     delta->AddToNamespace(TCallContext());
 
-    const boost::shared_ptr<ICIMInstance> association = AllocateRecord("KALMO_DeltaClassAssocToDelta");
-    SetProperty(*association, "Class", MakeReferenceTo(*deltaClassRecord));
-    SetProperty(*association, "Delta", MakeReferenceTo(*delta));
+    const boost::shared_ptr<ICIMInstance> association = AllocateRecord(kDeltaAssociation);
+    SetProperty(*association, kDeltaAssociationClass, MakeReferenceTo(*deltaClassRecord));
+    SetProperty(*association, kDeltaAssociationDelta, MakeReferenceTo(*delta));
     association->AddToNamespace(TCallContext());
 }
 
@@ -55,7 +56,7 @@ void TCIMDiffEngine::createObjectPathAlias(std::string className, std::string al
 {
     const TCIMValue index(static_cast<unsigned short>(nsIndex));
     TCallContext context;
-    context["nsIndex"] = index;
+    context[kNamespaceIndexEntry] = index;
     const boost::shared_ptr<ICIMClass> cls = deltaNamespace->GetClass(className, context);
     boost::dynamic_pointer_cast<TDeltaClass>(cls)->AddObjectPathAlias(alias, path);
 }

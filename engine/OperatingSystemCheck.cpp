@@ -4,6 +4,7 @@
 #include "host/TAddToVectorCallback.h"
 #include "host/TRootObject.h"
 #include "host/TZELException.h"
+#include "provider/DeltaNames.h"
 
 namespace NORVZEL20 {
 
@@ -14,9 +15,9 @@ namespace {
 /// That first one is always the reference's, so that inventories of different operating systems are compared all the same.
 unsigned short AppendOperatingSystems(ICIMNamespace& ns, std::vector<boost::shared_ptr<ICIMInstance>>& systems)
 {
-    const boost::shared_ptr<ICIMClass> cls = ns.GetClass("KALMO_OperatingSystem", TCallContext());
+    const boost::shared_ptr<ICIMClass> cls = ns.GetClass(kOperatingSystemClass, TCallContext());
     cls->EnumerateInstances(TAddToVectorCallback<ICIMInstance>(&systems), false, TCallContext());
-    return systems.at(0)->GetProperty("OSType", TCallContext())->GetValue(TCallContext());
+    return systems.at(0)->GetProperty(kOperatingSystemType, TCallContext())->GetValue(TCallContext());
 }
 
 }  // namespace

@@ -5,15 +5,14 @@
 
 #include "engine/TClassComparison.h"
 #include "engine/TMasterInstance.h"
+#include "host/RootClassName.h"
 #include "host/TAddToVectorCallback.h"
+#include "provider/DeltaNames.h"
 #include "spec/TDiffClassRules.h"
 
 namespace NORVZEL20 {
 
 namespace {
-
-const char kNoRulesMarker[] = "|fVMWareEnable";
-const char kCollectionTime[] = "DateTimeOfCollection";
 
 std::vector<std::string> GetDeclaredNames(ICIMClass& cls)
 {
@@ -44,7 +43,7 @@ TCIMDiffEngine::TCIMDiffEngine(boost::shared_ptr<ICIMNamespace> ns, std::vector<
 
 void TCIMDiffEngine::compare()
 {
-    const boost::shared_ptr<ICIMClass> root = namespaces.at(0)->GetClass("<root>", TCallContext());
+    const boost::shared_ptr<ICIMClass> root = namespaces.at(0)->GetClass(kRootClassName, TCallContext());
     CompareSubClasses(*root);
 }
 

@@ -8,6 +8,7 @@
 #include "host/TAddToVectorCallback.h"
 #include "host/TRootObject.h"
 #include "host/TZELException.h"
+#include "provider/DeltaNames.h"
 #include "spec/TDiffClassRules.h"
 
 namespace NORVZEL20 {
@@ -132,8 +133,8 @@ bool TCIMDiffEngine::TClassComparison::IsAnythingDifferent() const
 
 void TCIMDiffEngine::TClassComparison::CreateClassRecord()
 {
-    fClassRecord = fEngine.AllocateRecord("KALMO_DeltaClass");
-    SetProperty(*fClassRecord, "ClassName", TCIMValue(fClassName));
+    fClassRecord = fEngine.AllocateRecord(kClassRecord);
+    SetProperty(*fClassRecord, kClassRecordName, TCIMValue(fClassName));
     fClassRecord->AddToNamespace(TCallContext());
 }
 

@@ -8,6 +8,7 @@
 #include "host/TNamespaceProviderManager.h"
 #include "host/TOSSpecific.h"
 #include "host/TZELException.h"
+#include "provider/DeltaNames.h"
 #include "provider/Refuse.h"
 #include "provider/TDeltaClass.h"
 #include "provider/TDeltaNamespaceProvider.h"
@@ -66,7 +67,7 @@ void TDeltaNamespace::FindDifferences()
 
 unsigned short TDeltaNamespace::GetDiffIndex(TCallContext context) const
 {
-    const auto entry = context.find("nsIndex");
+    const auto entry = context.find(kNamespaceIndexEntry);
     if (entry == context.end()) {
         throw TZELException(TZELStatusCode::kMissingParameter);
     }

@@ -1,6 +1,7 @@
 #include "provider/TDeltaNamespaceProvider.h"
 
 #include "host/TRootObject.h"
+#include "provider/DeltaNames.h"
 #include "provider/TDeltaNamespace.h"
 
 namespace NORVZEL20 {
@@ -31,7 +32,7 @@ TZELStatusCode TDeltaNamespaceProvider::Initialize()
 
 const std::string& TDeltaNamespaceProvider::GetName(TCallContext) const
 {
-    static const std::string nspName("delta");
+    static const std::string nspName(kDeltaProviderName);
     return nspName;
 }
 

@@ -6,13 +6,12 @@
 #include "engine/TCIMDiffEngine.h"
 #include "host/TOSSpecific.h"
 #include "host/TZELException.h"
+#include "provider/DeltaNames.h"
 #include "spec/TDiffXMLParser.h"
 
 namespace NORVZEL20 {
 
 namespace {
-
-const std::uint64_t kMaxSpecFileSize = 104857600;
 
 std::size_t GetSpecFileSize(const std::string& fileName)
 {

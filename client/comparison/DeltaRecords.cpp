@@ -2,6 +2,8 @@
 
 #include <algorithm>
 
+#include "provider/DeltaNames.h"
+
 namespace NORVZEL20 {
 
 namespace {
@@ -19,10 +21,10 @@ std::string TextOf(const ICIMInstance& instance, const char* property)
 TDeltaRecord MakeRecord(const ICIMInstance& delta)
 {
     TDeltaRecord record;
-    record.type = static_cast<TDeltaNamespace::EDeltaType>(ValueOf(delta, "Type").GetUnsigned());
-    record.instanceName = TextOf(delta, "InstanceName");
-    record.property = TextOf(delta, "Property");
-    for (const TCIMValue& index : ValueOf(delta, "NamespaceIndices").GetElements()) {
+    record.type = static_cast<TDeltaNamespace::EDeltaType>(ValueOf(delta, kDeltaRecordType).GetUnsigned());
+    record.instanceName = TextOf(delta, kDeltaRecordInstance);
+    record.property = TextOf(delta, kDeltaRecordProperty);
+    for (const TCIMValue& index : ValueOf(delta, kDeltaRecordIndices).GetElements()) {
         record.inventories.push_back(index.GetUnsigned());
     }
     std::sort(record.inventories.begin(), record.inventories.end());
@@ -39,13 +41,13 @@ class TAssociationReader {
 
     void Read(const ICIMInstance& association)
     {
-        const TCIMReference classPath = ValueOf(association, "Class");
+        const TCIMReference classPath = ValueOf(association, kDeltaAssociationClass);
         const std::string path = classPath.GetPath();
         if (fCurrent == nullptr || path != fCurrentPath) {
             fCurrentPath = path;
-            fCurrent = &fRecords[TextOf(*fNamespace.GetInstance(classPath, TCallContext()), "ClassName")];
+            fCurrent = &fRecords[TextOf(*fNamespace.GetInstance(classPath, TCallContext()), kClassRecordName)];
         }
-        const TCIMReference deltaPath = ValueOf(association, "Delta");
+        const TCIMReference deltaPath = ValueOf(association, kDeltaAssociationDelta);
         fCurrent->push_back(MakeRecord(*fNamespace.GetInstance(deltaPath, TCallContext())));
     }
 
@@ -63,7 +65,7 @@ std::map<std::string, std::vector<TDeltaRecord>> ReadDeltaRecords(TDeltaNamespac
     std::map<std::string, std::vector<TDeltaRecord>> records;
     TAssociationReader reader(ns, records);
     std::string language = "WQL";
-    std::string query = "SELECT * FROM KALMO_DeltaClassAssocToDelta";
+    std::string query = std::string("SELECT * FROM ") + kDeltaAssociation;
     ns.ExecuteQuery(
         [&reader](boost::shared_ptr<ICIMInstance> association) {
             reader.Read(*association);

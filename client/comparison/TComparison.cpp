@@ -17,20 +17,19 @@
 #include "host/TAddToVectorCallback.h"
 #include "host/TNamespaceProviderManager.h"
 #include "host/TZELException.h"
+#include "provider/DeltaNames.h"
 #include "provider/TDeltaNamespaceProvider.h"
 
 namespace NORVZEL20 {
 
 namespace {
 
-const char kProviderName[] = "delta";
-const char kIndices[] = "NamespaceIndices";
-
 boost::shared_ptr<TDeltaNamespace> MakeDeltaNamespace()
 {
     // Linked with the plug-in, the client need not load it; asking for its provider keeps the linker from leaving it out.
     TDeltaNamespaceProvider::GetInstance();
-    const boost::shared_ptr<INamespaceProvider> provider = TNamespaceProviderManager::GetInstance()->FindProvider(kProviderName);
+    const boost::shared_ptr<INamespaceProvider> provider =
+        TNamespaceProviderManager::GetInstance()->FindProvider(kDeltaProviderName);
     if (!provider) {
         throw TClientError("the comparison plug-in did not register; is libdelta installed beside cimdelta?");
     }
@@ -58,15 +57,16 @@ void ForgetPosition(TDeltaNamespace& records, std::size_t position)
 {
     std::vector<boost::shared_ptr<ICIMInstance>> deltas;
     std::string language = "WQL";
-    std::string query = "SELECT * FROM KALMO_Delta";
+    std::string query = std::string("SELECT * FROM ") + kDeltaRecord;
     records.ExecuteQuery(TAddToVectorCallback<ICIMInstance>(&deltas), language, query, TCallContext());
     for (const boost::shared_ptr<ICIMInstance>& delta : deltas) {
-        std::vector<TCIMValue> indices = delta->GetProperty(kIndices, TCallContext())->GetValue(TCallContext()).GetElements();
+        std::vector<TCIMValue> indices =
+            delta->GetProperty(kDeltaRecordIndices, TCallContext())->GetValue(TCallContext()).GetElements();
         indices.erase(std::remove_if(indices.begin(), indices.end(),
                                      [position](const TCIMValue& index) { return index.GetUnsigned() == position; }),
                       indices.end());
         const TCIMValue kept(TCIMValue::TCIMType::kArrayUint16, static_cast<unsigned int>(indices.size()), indices);
-        records.ModifyInstance(delta->GetReference(TCallContext()), {{kIndices, kept}}, TCallContext());
+        records.ModifyInstance(delta->GetReference(TCallContext()), {{kDeltaRecordIndices, kept}}, TCallContext());
     }
 }
 

@@ -4,6 +4,7 @@
 #include "client/inventory/OperatingSystem.h"
 #include "client/text/TypeName.h"
 #include "host/TZELException.h"
+#include "provider/DeltaNames.h"
 
 namespace NORVZEL20 {
 
@@ -18,7 +19,8 @@ std::string Name(const ICIMClass& cls)
 bool HasUsableType(TInMemClass& systems)
 {
     try {
-        const unsigned short type = InstancesOf(systems).at(0)->GetProperty("OSType", TCallContext())->GetValue(TCallContext());
+        const unsigned short type =
+            InstancesOf(systems).at(0)->GetProperty(kOperatingSystemType, TCallContext())->GetValue(TCallContext());
         static_cast<void>(type);
         return true;
     } catch (const TZELException&) {
@@ -41,7 +43,8 @@ std::string FindSystemTrouble(const std::vector<TInventory>& inventories)
     if (HasUsableType(*systems)) {
         return "the inventories are as they should be; perhaps there was not enough memory";
     }
-    return "the first " + std::string(kOperatingSystemClass) + " of " + inventories[0].path + " has no OSType between 0 and 65535";
+    return "the first " + std::string(kOperatingSystemClass) + " of " + inventories[0].path + " has no " + kOperatingSystemType +
+           " between 0 and 65535";
 }
 
 // The reason of status 37.

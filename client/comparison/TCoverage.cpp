@@ -3,9 +3,9 @@
 #include <algorithm>
 #include <numeric>
 
-namespace NORVZEL20 {
+#include "provider/DeltaNames.h"
 
-const char* const kCollectionTime = "DateTimeOfCollection";
+namespace NORVZEL20 {
 
 bool TCoverage::IsComplete() const
 {

@@ -8,9 +8,6 @@
 
 namespace NORVZEL20 {
 
-/// The property that tells when an inventory was collected.
-extern const char* const kCollectionTime;
-
 /// What a comparison looked at and what it did not, and why.
 struct TCoverage {
     enum EState {

@@ -2,6 +2,7 @@
 
 #include <algorithm>
 
+#include "host/RootClassName.h"
 #include "host/TAddToVectorCallback.h"
 #include "host/TZELException.h"
 
@@ -61,7 +62,7 @@ std::vector<std::string> KeyNamesOf(const ICIMClass& cls)
 std::vector<boost::shared_ptr<ICIMClass>> AllClassesOf(ICIMNamespace& ns)
 {
     std::vector<boost::shared_ptr<ICIMClass>> classes;
-    std::vector<boost::shared_ptr<ICIMClass>> open = SubclassesOf(*ns.GetClass("<root>", TCallContext()));
+    std::vector<boost::shared_ptr<ICIMClass>> open = SubclassesOf(*ns.GetClass(kRootClassName, TCallContext()));
     std::reverse(open.begin(), open.end());
     while (!open.empty()) {
         classes.push_back(open.back());

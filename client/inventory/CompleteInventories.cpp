@@ -2,6 +2,7 @@
 
 #include "client/inventory/OperatingSystem.h"
 #include "client/inventory/TSchemaCompletion.h"
+#include "provider/DeltaNames.h"
 
 namespace NORVZEL20 {
 

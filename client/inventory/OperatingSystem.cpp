@@ -8,15 +8,13 @@
 #include "embedded/store/TSchemaCopier.h"
 #include "host/TCIMDateTime.h"
 #include "host/TZELException.h"
+#include "provider/DeltaNames.h"
 
 namespace NORVZEL20 {
-
-const char* const kOperatingSystemClass = "KALMO_OperatingSystem";
 
 namespace {
 
 const char kStandardClass[] = "CIM_OperatingSystem";
-const char kTypeProperty[] = "OSType";
 const char kNameProperty[] = "Name";
 const char kKeyQualifier[] = "Key";
 
@@ -64,7 +62,7 @@ TSystem Describe(TInMemNamespace& ns)
     if (!name.IsNull() && name.GetType() == TCIMValue::TCIMType::kString) {
         system.name = name;
     }
-    const TCIMValue type = FindValue(*instance, kTypeProperty);
+    const TCIMValue type = FindValue(*instance, kOperatingSystemType);
     if (!type.IsNull() && type.GetType() == TCIMValue::TCIMType::kUint16) {
         system.type = type.GetUnsigned();
     }
@@ -177,19 +175,19 @@ TCIMValue SomeValue(TCIMValue::TCIMType type, const std::string& className)
 void AddTypeProperty(const TInventory& inventory, TInMemClass& cls)
 {
     for (const boost::shared_ptr<TInMemClass>& below : cls.GetClassesBelow()) {
-        const boost::shared_ptr<TInMemPropertyDecl> other = below->FindPropertyDecl(kTypeProperty);
+        const boost::shared_ptr<TInMemPropertyDecl> other = below->FindPropertyDecl(kOperatingSystemType);
         if (other && other->GetType() != TCIMValue::TCIMType::kUint16) {
             Refuse(inventory, "property " + other->GetName() + " of " + below->GetName() + " is " + TypeName(other->GetType()) +
                                   " instead of uint16");
         }
     }
-    AddProperty(*inventory.ns, cls, kTypeProperty, TCIMValue::TCIMType::kUint16, false);
+    AddProperty(*inventory.ns, cls, kOperatingSystemType, TCIMValue::TCIMType::kUint16, false);
 }
 
 void AddInstance(const TInventory& inventory, TInMemClass& cls)
 {
     TInMemNamespace& ns = *inventory.ns;
-    if (!cls.FindPropertyDecl(kTypeProperty)) {
+    if (!cls.FindPropertyDecl(kOperatingSystemType)) {
         AddTypeProperty(inventory, cls);
     }
     const TSystem system = Describe(ns);
@@ -204,7 +202,7 @@ void AddInstance(const TInventory& inventory, TInMemClass& cls)
     if (name != TInMemClass::kNoSlot && cls.GetSlotDecl(name).GetType() == TCIMValue::TCIMType::kString) {
         instance->SetSlot(name, system.name);
     }
-    const std::uint32_t type = cls.FindSlot(kTypeProperty);
+    const std::uint32_t type = cls.FindSlot(kOperatingSystemType);
     if (cls.GetSlotDecl(type).GetType() == TCIMValue::TCIMType::kUint16) {
         instance->SetSlot(type, TCIMValue(static_cast<unsigned short>(system.type)));
     }

@@ -8,9 +8,6 @@
 
 namespace NORVZEL20 {
 
-/// The class that every comparison asks for.
-extern const char* const kOperatingSystemClass;
-
 /// Gives each inventory that lacks it an instance of KALMO_OperatingSystem, and the class where it lacks that.
 ///
 /// Class and instance are made after those of another inventory where there is one, else with the key Name and OSType alone. OSType

@@ -3,6 +3,7 @@
 #include <string_view>
 
 #include "embedded/cimxml/TCimXmlWriter.h"
+#include "provider/DeltaNames.h"
 
 namespace NORVZEL20 {
 
@@ -11,7 +12,7 @@ std::string WriteCimXmlReport(const TComparisonReport& report)
     std::string text;
     TCimXmlWriter writer([&text](std::string_view piece) { text += piece; });
     // The records' classes live in the delta namespace's store, which holds nothing else.
-    writer.WriteNamespace(*report.records->GetClass("KALMO_Delta", TCallContext())->GetNamespace(TCallContext()));
+    writer.WriteNamespace(*report.records->GetClass(kDeltaRecord, TCallContext())->GetNamespace(TCallContext()));
     return text;
 }
 

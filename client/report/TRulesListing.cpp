@@ -7,6 +7,7 @@
 #include "client/text/Counted.h"
 #include "client/text/DisplayText.h"
 #include "embedded/value/TNameText.h"
+#include "provider/DeltaNames.h"
 
 namespace NORVZEL20 {
 

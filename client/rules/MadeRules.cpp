@@ -4,6 +4,8 @@
 
 #include "client/inventory/CimWalk.h"
 #include "client/inventory/OperatingSystem.h"
+#include "host/RootClassName.h"
+#include "provider/DeltaNames.h"
 
 namespace NORVZEL20 {
 
@@ -46,7 +48,7 @@ bool IsMade(const std::vector<TSchemaNote>& notes)
 std::string MakeRulesForEverything(const TInventory& reference, const std::vector<TSchemaNote>& notes)
 {
     std::string rules = "<?xml version=\"1.0\" encoding=\"UTF-8\"?>\n<DifftoolSpec version=\"1.0\">\n";
-    for (const boost::shared_ptr<ICIMClass>& cls : SubclassesOf(*reference.ns->GetClass("<root>", TCallContext()))) {
+    for (const boost::shared_ptr<ICIMClass>& cls : SubclassesOf(*reference.ns->GetClass(kRootClassName, TCallContext()))) {
         rules += Element(cls->GetName(TCallContext()), "include");
     }
     if (IsMade(notes)) {

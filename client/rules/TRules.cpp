@@ -11,21 +11,18 @@
 #include "client/rules/RulesFault.h"
 #include "client/rules/TLogCapture.h"
 #include "host/TZELException.h"
+#include "provider/DeltaNames.h"
 
 namespace NORVZEL20 {
 
 namespace {
 
-// A name with this in it makes the plug-in go without rules, which nobody asks for by naming a file.
-const char kMarker[] = "|fVMWareEnable";
-
-const off_t kLargestFile = 104857600;
-
 void CheckFile(const std::string& file)
 {
     struct stat status;
-    if (file.find(kMarker) != std::string::npos) {
-        throw TClientError(file + ": a rules file cannot have " + kMarker + " in its name; rename it");
+    // With the marker the plug-in would go without rules, which nobody asks for by naming a file.
+    if (file.find(kNoRulesMarker) != std::string::npos) {
+        throw TClientError(file + ": a rules file cannot have " + kNoRulesMarker + " in its name; rename it");
     }
     if (stat(file.c_str(), &status) != 0) {
         throw TClientError(file + ": cannot be opened: " + std::strerror(errno));
@@ -33,8 +30,9 @@ void CheckFile(const std::string& file)
     if (!S_ISREG(status.st_mode)) {
         throw TClientError(file + ": is no regular file; save the rules to a file and name that");
     }
-    if (status.st_size > kLargestFile) {
-        throw TClientError(file + ": is larger than 104857600 bytes, the most that a rules file may have");
+    if (status.st_size > static_cast<off_t>(kMaxSpecFileSize)) {
+        throw TClientError(file + ": is larger than " + std::to_string(kMaxSpecFileSize) +
+                           " bytes, the most that a rules file may have");
     }
 }
 

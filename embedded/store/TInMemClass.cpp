@@ -5,13 +5,12 @@
 #include "embedded/store/TDeclCopy.h"
 #include "embedded/store/TInMemNamespace.h"
 #include "embedded/value/TNameText.h"
+#include "host/RootClassName.h"
 #include "host/TZELException.h"
 
 namespace NORVZEL20 {
 
 namespace {
-
-const char* const kRootName = "<root>";
 
 boost::shared_ptr<TInMemClass> RequireInMem(const boost::shared_ptr<ICIMClass>& cls)
 {
@@ -151,7 +150,7 @@ bool TInMemClass::IsAbstract() const
 
 bool TInMemClass::IsPseudoClass() const noexcept
 {
-    return fName == kRootName;
+    return fName == kRootClassName;
 }
 
 bool TInMemClass::IsRootClass(TCallContext) const
@@ -215,7 +214,7 @@ bool TInMemClass::IsSubclassOf(std::string_view name) const noexcept
             return true;
         }
     }
-    return name == kRootName;
+    return name == kRootClassName;
 }
 
 bool TInMemClass::IsSubclassOf(boost::shared_ptr<const ICIMClass> cls, TCallContext context) const

@@ -4,13 +4,12 @@
 
 #include "embedded/store/TInMemNamespaceProvider.h"
 #include "embedded/value/EraseLast.h"
+#include "host/RootClassName.h"
 #include "host/TZELException.h"
 
 namespace NORVZEL20 {
 
 namespace {
-
-const char* const kRootName = "<root>";
 
 std::string WithoutSlashes(const std::string& name)
 {
@@ -25,7 +24,7 @@ TInMemNamespace::TInMemNamespace(const std::string& name) : fName(WithoutSlashes
 boost::shared_ptr<TInMemNamespace> TInMemNamespace::Create(const std::string& name)
 {
     const boost::shared_ptr<TInMemNamespace> ns(new TInMemNamespace(name));
-    ns->fRoot = TInMemClass::Create(ns, kRootName, nullptr);
+    ns->fRoot = TInMemClass::Create(ns, kRootClassName, nullptr);
     return ns;
 }
 
@@ -65,7 +64,7 @@ boost::shared_ptr<TInMemClass> TInMemNamespace::AllocateInMemClass(const std::st
                                                                    boost::shared_ptr<TInMemClass> superClass)
 {
     const bool isForeign = superClass && superClass->fNamespace.lock().get() != this;
-    if (name.empty() || name == kRootName || isForeign) {
+    if (name.empty() || name == kRootClassName || isForeign) {
         throw TZELException(TZELStatusCode::kInvalidParameter);
     }
     if (superClass == fRoot) {
@@ -92,7 +91,7 @@ boost::shared_ptr<TInMemClass> TInMemNamespace::FindClass(std::string_view name)
 
 boost::shared_ptr<ICIMClass> TInMemNamespace::GetClass(const std::string& name, TCallContext)
 {
-    auto cls = name == kRootName ? fRoot : FindClass(name);
+    auto cls = name == kRootClassName ? fRoot : FindClass(name);
     if (!cls) {
         throw TZELException(TZELStatusCode::kNotFound);
     }

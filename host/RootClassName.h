@@ -1,0 +1,8 @@
+#pragma once
+
+namespace NORVZEL20 {
+
+/// The name of the pseudo-class above all top-level classes. ICIMNamespace::GetClass finds it; it is no class that can be declared.
+inline constexpr char kRootClassName[] = "<root>";
+
+}  // namespace NORVZEL20
