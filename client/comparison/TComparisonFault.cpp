@@ -2,7 +2,7 @@
 
 #include "client/inventory/CimWalk.h"
 #include "client/inventory/OperatingSystem.h"
-#include "client/text/TypeName.h"
+#include "embedded/value/TValueText.h"
 #include "host/TZELException.h"
 #include "provider/DeltaNames.h"
 
@@ -77,8 +77,9 @@ std::string FindOtherType(const TInventory& reference, const TInventory& other, 
         const TInMemPropertyDecl& property = cls.GetSlotDecl(slot);
         const boost::shared_ptr<TInMemPropertyDecl> counterpart = there ? there->FindPropertyDecl(property.GetName()) : nullptr;
         if (counterpart && counterpart->GetType() != property.GetType()) {
-            return "property " + property.GetName() + " of class " + cls.GetName() + " is " + TypeName(property.GetType()) +
-                   " in " + reference.path + " and " + TypeName(counterpart->GetType()) + " in " + other.path;
+            return "property " + property.GetName() + " of class " + cls.GetName() + " is " +
+                   TValueText::DescribeType(property.GetType()) + " in " + reference.path + " and " +
+                   TValueText::DescribeType(counterpart->GetType()) + " in " + other.path;
         }
     }
     return std::string();

@@ -4,8 +4,8 @@
 
 #include "client/inventory/CimWalk.h"
 #include "client/process/TClientError.h"
-#include "client/text/TypeName.h"
 #include "embedded/store/TSchemaCopier.h"
+#include "embedded/value/TValueText.h"
 #include "host/TCIMDateTime.h"
 #include "host/TZELException.h"
 #include "provider/DeltaNames.h"
@@ -100,8 +100,9 @@ std::string DescribeConflict(const TInMemClass& declared, const TInMemNamespace&
         for (const boost::shared_ptr<TInMemPropertyDecl>& own : cls->GetOwnPropertyDecls()) {
             const boost::shared_ptr<TInMemPropertyDecl> above = super ? super->FindPropertyDecl(own->GetName()) : nullptr;
             if (above && above->GetType() != own->GetType()) {
-                return "property " + own->GetName() + " of " + cls->GetName() + " is " + TypeName(own->GetType()) + " there, but " +
-                       super->GetName() + " declares it as " + TypeName(above->GetType()) + " here";
+                return "property " + own->GetName() + " of " + cls->GetName() + " is " + TValueText::DescribeType(own->GetType()) +
+                       " there, but " + super->GetName() + " declares it as " + TValueText::DescribeType(above->GetType()) +
+                       " here";
             }
         }
     }
@@ -177,8 +178,8 @@ void AddTypeProperty(const TInventory& inventory, TInMemClass& cls)
     for (const boost::shared_ptr<TInMemClass>& below : cls.GetClassesBelow()) {
         const boost::shared_ptr<TInMemPropertyDecl> other = below->FindPropertyDecl(kOperatingSystemType);
         if (other && other->GetType() != TCIMValue::TCIMType::kUint16) {
-            Refuse(inventory, "property " + other->GetName() + " of " + below->GetName() + " is " + TypeName(other->GetType()) +
-                                  " instead of uint16");
+            Refuse(inventory, "property " + other->GetName() + " of " + below->GetName() + " is " +
+                                  TValueText::DescribeType(other->GetType()) + " instead of uint16");
         }
     }
     AddProperty(*inventory.ns, cls, kOperatingSystemType, TCIMValue::TCIMType::kUint16, false);

@@ -5,11 +5,11 @@
 #include <tuple>
 
 #include "client/process/TClientError.h"
-#include "client/text/TypeName.h"
 #include "embedded/store/TReferenceAdapter.h"
 #include "embedded/store/TSchemaCopier.h"
 #include "embedded/store/TSchemaLimitError.h"
 #include "embedded/value/TNameText.h"
+#include "embedded/value/TValueText.h"
 #include "host/TZELException.h"
 
 namespace NORVZEL20 {
@@ -32,8 +32,8 @@ std::string DescribeConflict(const TInMemClass& cls, const TInMemPropertyDecl& p
     for (const boost::shared_ptr<TInMemClass>& below : cls.GetClassesBelow()) {
         const boost::shared_ptr<TInMemPropertyDecl> other = below->FindPropertyDecl(property.GetName());
         if (other && other->GetType() != property.GetType()) {
-            return "class " + below->GetName() + " below it has one of that name with the type " + TypeName(other->GetType()) +
-                   " instead of " + TypeName(property.GetType());
+            return "class " + below->GetName() + " below it has one of that name with the type " +
+                   TValueText::DescribeType(other->GetType()) + " instead of " + TValueText::DescribeType(property.GetType());
         }
     }
     return "the declarations do not fit together";

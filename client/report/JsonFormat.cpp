@@ -1,7 +1,7 @@
 #include "client/report/JsonFormat.h"
 
 #include "client/report/JsonValue.h"
-#include "client/text/TypeName.h"
+#include "embedded/value/TValueText.h"
 
 namespace NORVZEL20 {
 
@@ -66,7 +66,7 @@ TJson Labels(const TComparisonReport& report, const std::vector<std::size_t>& in
 
 TJson ValueWithType(const TCIMValue& value)
 {
-    return {{"type", TypeName(value.GetType())}, {"value", JsonOf(value)}};
+    return {{"type", TValueText::DescribeType(value.GetType())}, {"value", JsonOf(value)}};
 }
 
 void AddValues(TJson& json, const TComparisonReport& report, const TDifference& difference)

@@ -6,7 +6,7 @@
 #include "client/report/TextCoverage.h"
 #include "client/text/Counted.h"
 #include "client/text/DisplayText.h"
-#include "client/text/TypeName.h"
+#include "embedded/value/TValueText.h"
 
 namespace NORVZEL20 {
 
@@ -121,7 +121,7 @@ std::string TTextFormat::OneValue(const TDifference& difference, const TCIMValue
     const bool typesDiffer = std::any_of(difference.others.begin(), difference.others.end(), [&](const TDifference::TGroup& group) {
         return group.value.GetType() != difference.reference.GetType();
     });
-    return (typesDiffer ? TypeName(value.GetType()) + " " : std::string()) + DisplayValue(value);
+    return (typesDiffer ? TValueText::DescribeType(value.GetType()) + " " : std::string()) + DisplayValue(value);
 }
 
 std::string TTextFormat::InstanceText(const TDifference& difference) const

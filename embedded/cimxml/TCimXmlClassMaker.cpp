@@ -12,11 +12,6 @@ namespace {
 
 using EStatus = TZELStatusCode::EStatusCode;
 
-std::string DescribeType(TCIMValue::TCIMType type)
-{
-    return std::string(TValueText::GetTypeName(type)) + (type.IsArray() ? "[]" : "");
-}
-
 }  // namespace
 
 boost::shared_ptr<TInMemClass> TCimXmlClassMaker::Make(const TCimXmlDraft& draft, const boost::shared_ptr<TInMemClass>& super)
@@ -64,8 +59,9 @@ void TCimXmlClassMaker::AddProperty(TInMemClass& cls, const TEmbeddedObject::TPr
         super != nullptr ? super->FindPropertyDecl(property.fName) : boost::shared_ptr<TInMemPropertyDecl>();
     if (inherited && inherited->GetType() != type) {
         fContext.Fail(EStatus::kTypeMismatch, "found property " + TCimXmlContext::Quote(property.fName) + " of type " +
-                                                  DescribeType(type) + " in class " + TCimXmlContext::Quote(cls.GetName()) +
-                                                  ", but a superclass declares it as " + DescribeType(inherited->GetType()));
+                                                  TValueText::DescribeType(type) + " in class " +
+                                                  TCimXmlContext::Quote(cls.GetName()) + ", but a superclass declares it as " +
+                                                  TValueText::DescribeType(inherited->GetType()));
     }
     if (inherited && property.fPropagated) {
         return;

@@ -232,18 +232,16 @@ void TCimXmlLoader::SetProperty(const TTarget& target, TCIMValue&& value, bool m
 TCIMValue TCimXmlLoader::Convert(const TTarget& target, const TCIMValue& value)
 {
     const TInMemPropertyDecl& decl = fLayout->cls->GetSlotDecl(target.slot);
-    const auto describe = [](TCIMValue::TCIMType type) {
-        return std::string(TValueText::GetTypeName(type)) + (type.IsArray() ? "[]" : "");
-    };
     TCIMValue converted;
     if (!TValueText::Convert(value, target.type, converted)) {
-        fContext.Fail(EStatus::kTypeMismatch, "found " + Quote(value.ToText()) + " of type " + describe(value.GetType()) +
-                                                  " in property " + Quote(decl.GetName()) + ", which class " +
-                                                  Quote(fLayout->cls->GetName()) + " declares as " + describe(target.type));
+        fContext.Fail(EStatus::kTypeMismatch, "found " + Quote(value.ToText()) + " of type " +
+                                                  TValueText::DescribeType(value.GetType()) + " in property " +
+                                                  Quote(decl.GetName()) + ", which class " + Quote(fLayout->cls->GetName()) +
+                                                  " declares as " + TValueText::DescribeType(target.type));
     }
     fContext.Tolerate("other type", "property " + Quote(decl.GetName()) + " of class " + Quote(fLayout->cls->GetName()) +
-                                        " is written as " + describe(value.GetType()) + "; taken as the declared " +
-                                        describe(target.type));
+                                        " is written as " + TValueText::DescribeType(value.GetType()) + "; taken as the declared " +
+                                        TValueText::DescribeType(target.type));
     return converted;
 }
 

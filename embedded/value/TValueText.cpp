@@ -170,6 +170,12 @@ const char* TValueText::GetTypeName(TCIMValue::TCIMType type) noexcept
     return element <= TType::kReference ? kTypeNames[element] : "";
 }
 
+std::string TValueText::DescribeType(TCIMValue::TCIMType type)
+{
+    const std::string name = GetTypeName(type);
+    return (name.empty() ? "none" : name) + (type.IsArray() ? "[]" : "");
+}
+
 TCIMValue::TCIMType TValueText::FindType(std::string_view name) noexcept
 {
     for (unsigned char code = TType::kBoolean; code <= TType::kReference; ++code) {

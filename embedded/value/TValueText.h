@@ -27,9 +27,11 @@ class TValueText {
     /// char16, datetimes and references to text, arrays element by element. Returns false, and leaves `result` as it is, otherwise.
     static bool Convert(const TCIMValue& value, TCIMValue::TCIMType type, TCIMValue& result);
 
-    /// The name of a type in CIM-XML: "uint16" for the type and for arrays of it, "reference", "" for none.
+    /// The name of a type in CIM-XML: "uint16" for the type and for arrays of it, "reference", "" for kNone.
     static const char* GetTypeName(TCIMValue::TCIMType type) noexcept;
-    /// The element type of that name in lower case ("reference" included); kNone where there is none.
+    /// A type for people: "uint16", "uint16[]", "none".
+    static std::string DescribeType(TCIMValue::TCIMType type);
+    /// The element type of that name in lower case ("reference" included); kNone if no type has that name.
     static TCIMValue::TCIMType FindType(std::string_view name) noexcept;
 
     /// Appends a non-null boolean, number, char16, text or datetime as it is, unquoted and unescaped.

@@ -209,5 +209,12 @@ TEST(ValueTextTest, TypesHaveTheirNames)
     EXPECT_EQ(TType::kNone, TValueText::FindType("uint"));
 }
 
+TEST(ValueTextTest, TypesAreDescribedWithBracketsForArrays)
+{
+    EXPECT_EQ("none", TValueText::DescribeType(TType::kNone));
+    EXPECT_EQ("reference", TValueText::DescribeType(TType::kReference));
+    EXPECT_EQ("uint16[]", TValueText::DescribeType(TType::kArrayUint16));
+}
+
 }  // namespace
 }  // namespace NORVZEL20
