@@ -10,8 +10,8 @@ class ICIMElement {
   public:
     virtual ~ICIMElement() = default;
 
-    /// Returns where the element could be added to its namespace as it is.
-    /// Errors: the status with which adding it would fail.
+    /// Returns if the element could be added to its namespace as it is.
+    /// Errors: TZELException with the status that adding it would fail with.
     virtual void Validate(TCallContext context) const = 0;
 };
 

@@ -2,7 +2,7 @@
 
 namespace NORVZEL20 {
 
-/// What a subscription asks for; opaque to everybody but the host that made it.
+/// What a subscription asks for. Only the host that made it knows its contents.
 class ICIMIndicationFilter {
   public:
     virtual ~ICIMIndicationFilter() = default;

@@ -14,20 +14,22 @@ class ICIMClass;
 
 /// An instance of a class. The order of the operations is part of the contract.
 ///
-/// Made by ICIMClass::AllocateInstance with every property null, filled through GetProperty, and visible in its namespace from
-/// AddToNamespace on.
+/// ICIMClass::AllocateInstance makes it with every property null. Its properties are set through GetProperty, and AddToNamespace
+/// makes it visible.
 class ICIMInstance : public ICIMElement {
   public:
     /// Makes the instance part of its class's namespace.
-    /// Errors: status 12 where one with the same keys is there, 14 where a key has no value, 18 where the namespace is gone.
+    /// Errors: kAlreadyExists (12) if the namespace has an instance with the same keys, kKeyMissing (14) if a key has no value,
+    /// kNamespaceGone (18).
     virtual void AddToNamespace(TCallContext context) = 0;
 
-    /// The object path: namespace, class and keys. A key changed after the instance was added shows as it was added.
+    /// The object path: namespace, class and keys. The path has the keys that the instance was added with, even if a key was
+    /// changed later.
     virtual TCIMReference GetReference(TCallContext context) const = 0;
 
     virtual boost::shared_ptr<ICIMClass> GetClass(TCallContext context) const = 0;
 
-    /// The property of that name; letter case does not count. Errors: status 15 where the class declares none.
+    /// The property of that name, in any letter case. Errors: kNotFound (15) if the class does not declare it.
     virtual boost::shared_ptr<ICIMProperty> GetProperty(const std::string& name, TCallContext context) const = 0;
 
     /// All properties, in the order of their declarations, until the callback returns false.

@@ -9,9 +9,9 @@ namespace NORVZEL20 {
 /// The declaration of a method in a class.
 class ICIMMethodDecl : public ICIMNamedElement {
   public:
-    /// The name as declared; valid while the declaration lives.
+    /// The name as declared. Valid while the declaration lives.
     virtual const std::string& GetName(TCallContext context) const = 0;
-    /// The type of the result; kNone for none.
+    /// The type of the result; kNone if the method returns nothing.
     virtual TCIMValue::TCIMType GetType(TCallContext context) const = 0;
 };
 

@@ -10,22 +10,22 @@ namespace NORVZEL20 {
 
 /// One property value of an instance, or a static property of a class. The order of the operations is part of the contract.
 ///
-/// A handle keeps the instance alive that it was got from. Reading allocates nothing.
+/// A handle keeps its instance alive. Reading allocates nothing.
 class ICIMProperty {
   public:
     virtual ~ICIMProperty() = default;
 
-    /// Valid while the property lives; changes with it.
+    /// The current value: the reference shows later changes too. Valid while the property lives.
     virtual const TCIMValue& GetValue(TCallContext context) const = 0;
 
-    /// Gives the property a value; null of any type clears it. Errors: status 13 where the value does not fit the declared
-    /// type; the property is then as it was.
+    /// Sets the value; a null of any type clears it.
+    /// Errors: kTypeMismatch (13) if the value does not fit the declared type; the property then keeps its value.
     virtual void SetValue(const TCIMValue& value, TCallContext context) = 0;
 
-    /// Marks the value as gone from the other side of a comparison. The value stays.
+    /// Records that the other side of a comparison lacks this value. The value stays.
     virtual void MarkRemoved() = 0;
 
-    /// Gives the property the other side's value and remembers what it held before the first such change.
+    /// Sets the value to that of the other side of a comparison and remembers the value before the first such change.
     /// Errors: as SetValue.
     virtual void MarkChanged(const TCIMValue& value) = 0;
 

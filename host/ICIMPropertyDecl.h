@@ -9,10 +9,10 @@ namespace NORVZEL20 {
 /// The declaration of a property in a class.
 class ICIMPropertyDecl : public ICIMNamedElement {
   public:
-    /// The name as declared; valid while the declaration lives.
+    /// The name as declared. Valid while the declaration lives.
     virtual const std::string& GetName(TCallContext context) const = 0;
     virtual TCIMValue::TCIMType GetType(TCallContext context) const = 0;
-    /// The declared default, a typed null where there is none; valid while the declaration lives. Instances do not start with it.
+    /// The declared default, or a typed null. Valid while the declaration lives. New instances do not start with it.
     virtual const TCIMValue& GetDefaultValue(TCallContext context) const = 0;
 };
 

@@ -11,7 +11,7 @@ class ICIMQualifier {
   public:
     virtual ~ICIMQualifier() = default;
 
-    /// The name as declared; valid while the qualifier lives.
+    /// The name as declared. Valid while the qualifier lives.
     virtual const std::string& GetName(TCallContext context) const = 0;
     /// Valid while the qualifier lives.
     virtual const TCIMValue& GetValue(TCallContext context) const = 0;

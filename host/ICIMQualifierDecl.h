@@ -7,10 +7,10 @@
 
 namespace NORVZEL20 {
 
-/// The declaration of a qualifier: its type and default, what it may stand on, and how it is inherited.
+/// The declaration of a qualifier: its type and default, which elements may have it, and how it is inherited.
 class ICIMQualifierDecl {
   public:
-    /// What the qualifier may stand on; a set of bits (DSP0004, 5.6.2).
+    /// The elements that may have the qualifier; a set of bits (DSP0004, 5.6.2).
     enum EScope : unsigned int {
         kScopeNone = 0,
         kScopeClass = 1,
@@ -35,9 +35,9 @@ class ICIMQualifierDecl {
 
     virtual ~ICIMQualifierDecl() = default;
 
-    /// The name as declared; valid while the declaration lives.
+    /// The name as declared. Valid while the declaration lives.
     virtual const std::string& GetName(TCallContext context) const = 0;
-    /// The default value, a typed null where there is none; valid while the declaration lives.
+    /// The default value, or a typed null. Valid while the declaration lives.
     virtual const TCIMValue& GetValue(TCallContext context) const = 0;
     virtual EScope GetScope(TCallContext context) const = 0;
     virtual EFlavor GetFlavor(TCallContext context) const = 0;

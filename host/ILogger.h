@@ -9,7 +9,7 @@ class ILogger {
   public:
     virtual ~ILogger() = default;
 
-    /// Writes one entry. Level 0 is an error; the higher the level, the less urgent. The message may end with a line end.
+    /// Writes one entry. Level 0 is an error; a higher level is less urgent. The message may end with a line break.
     virtual void Log(int level, const std::string& message) = 0;
 };
 

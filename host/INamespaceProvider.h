@@ -16,14 +16,14 @@ class INamespaceProvider {
   public:
     virtual ~INamespaceProvider() = default;
 
-    /// The name it is found under; valid while the provider's library is loaded, but not once the handlers of the process's exit
-    /// run: one of them may destroy it.
+    /// The name that the provider is registered under. Valid while the provider's library is loaded, but not in handlers that run
+    /// when the process exits: one of them may already have destroyed it.
     virtual const std::string& GetName(TCallContext context) const = 0;
 
-    /// A new namespace of its own. What the flag means is the provider's; `name` is the namespace's name, such as "root/cimv2".
+    /// A new namespace with the name `name`, such as "root/cimv2". Each provider defines what the flag means.
     virtual boost::shared_ptr<ICIMNamespace> AllocateNamespace(TCallContext context, bool flag, std::string name) const = 0;
 
-    /// The provider's kind: 0 stores what it is given, 1 derives its contents from other namespaces.
+    /// The kind of provider: 0 if its namespaces store what they are given, 1 if they derive it from other namespaces.
     virtual int GetType(TCallContext context) const = 0;
 
     virtual bool IsIndicationsSupported(TCallContext context) const = 0;

@@ -7,12 +7,13 @@
 
 namespace NORVZEL20 {
 
-/// Where namespace providers are registered. The order of the operations is part of the contract.
+/// The registry of namespace providers. The order of the operations is part of the contract.
 class INamespaceProviderManager {
   public:
     virtual ~INamespaceProviderManager() = default;
 
-    /// Registers `provider` under its name. A second one of a name is refused with status 12 and the first stays.
+    /// Registers `provider` under its name. Returns kSuccess (0), or kAlreadyExists (12) if the name is taken; the provider that
+    /// has the name then stays registered.
     virtual TZELStatusCode RegisterProvider(boost::shared_ptr<INamespaceProvider> provider) = 0;
 };
 

@@ -2,7 +2,7 @@
 
 namespace NORVZEL20 {
 
-/// An instance provider of a namespace; opaque to everybody but the host that made it.
+/// An instance provider of a namespace. Only the host that made it knows its contents.
 class IProvider {
   public:
     virtual ~IProvider() = default;

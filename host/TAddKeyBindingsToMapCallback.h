@@ -9,14 +9,14 @@
 
 namespace NORVZEL20 {
 
-/// Puts the key bindings of an object path into the caller's map; a name that is there already keeps its value.
+/// Adds the key bindings of an object path to the caller's map. A name that the map has already keeps its value.
 ///
 /// The map is not owned and must outlive the enumeration.
 class TAddKeyBindingsToMapCallback : public TUnaryFunction<std::pair<std::string, TCIMValue>> {
   public:
     explicit TAddKeyBindingsToMapCallback(std::map<std::string, TCIMValue>* bindings) : fBindings(bindings) {}
 
-    /// Always true: the enumeration goes on.
+    /// Always returns true, so the enumeration continues.
     bool operator()(const std::pair<std::string, TCIMValue>& binding) const
     {
         fBindings->insert(binding);

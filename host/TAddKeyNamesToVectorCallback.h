@@ -9,13 +9,13 @@ namespace NORVZEL20 {
 
 /// Appends the key names of a class to the caller's vector.
 ///
-/// The names are not copied: they are the class's own, so the class must live as long as the vector is used. The vector is not
-/// owned and must outlive the enumeration.
+/// The names are not copied; they belong to the class, which must live as long as the vector is used. The vector is not owned and
+/// must outlive the enumeration.
 class TAddKeyNamesToVectorCallback : public TUnaryFunction<const std::string*> {
   public:
     explicit TAddKeyNamesToVectorCallback(std::vector<const std::string*>* names) : fNames(names) {}
 
-    /// Always true: the enumeration goes on.
+    /// Always returns true, so the enumeration continues.
     bool operator()(const std::string* name) const
     {
         fNames->push_back(name);

@@ -15,7 +15,7 @@ class TAddToVectorCallback : public TUnaryFunction<boost::shared_ptr<T>> {
   public:
     explicit TAddToVectorCallback(std::vector<boost::shared_ptr<T>>* elements) : fElements(elements) {}
 
-    /// Always true: the enumeration goes on.
+    /// Always returns true, so the enumeration continues.
     bool operator()(boost::shared_ptr<T> element) const
     {
         fElements->push_back(element);

@@ -8,34 +8,35 @@ namespace NORVZEL20 {
 
 /// A CIM datetime: a point in time with its UTC offset, or an interval (DSP0004, 5.2.4 "Datetime type").
 ///
-/// Fields, and single digits of the microseconds, may be asterisks: not known. A value type of 16 bytes, no allocation.
+/// A field, or a single digit of the microseconds, that is not known is written in asterisks. A value type of 16 bytes; nothing is
+/// allocated.
 class TCIMDateTime {
   public:
     /// The point in time 1970-01-01 00:00 UTC.
     TCIMDateTime() noexcept = default;
 
     /// Reads the 25 characters "yyyymmddhhmmss.mmmmmmsutc" or "ddddddddhhmmss.mmmmmm:000". Returns false, and leaves `result` as
-    /// it is, for any other length, form or range (month 13, hour 24, second 60, a day that its month lacks).
+    /// it is, for any other text and for a field out of range (month 13, hour 24, second 60, February 30).
     static bool Parse(std::string_view text, TCIMDateTime& result) noexcept;
 
-    /// The 25 characters, with the offset and the asterisks it was read with ("-000" comes back as "+000").
+    /// The 25 characters, with the offset and the asterisks that were read. "-000" is written as "+000".
     std::string ToText() const;
 
     bool IsInterval() const noexcept { return fInterval; }
 
-    /// Equal instants (the offset applied) or equal intervals, with asterisks in the same places. An interval never equals a
+    /// Equal instants, whatever their offsets, or equal intervals, with asterisks in the same places. An interval never equals a
     /// point in time.
     bool operator==(const TCIMDateTime& other) const noexcept;
     bool operator!=(const TCIMDateTime& other) const noexcept { return !(*this == other); }
-    /// The order of instants, or of lengths; points in time stand before intervals.
+    /// Points in time by instant, intervals by length, and every point in time before every interval.
     bool operator<(const TCIMDateTime& other) const noexcept;
 
-    /// Microseconds since 1970-01-01 00:00 UTC, or of the interval; asterisks count as the least value of their field.
+    /// Microseconds since 1970-01-01 00:00 UTC, or of the interval; an unknown field counts as the least value it can have.
     std::int64_t GetMicroseconds() const noexcept { return fMicroseconds; }
     /// Minutes east of UTC; 0 for an interval.
     std::int16_t GetOffset() const noexcept { return fOffset; }
-    /// One bit for each unknown field, from the most significant (bit 0: years or the days of an interval) to the
-    /// last digit of the microseconds (bit 11).
+    /// One bit for each unknown field: bit 0 for the years (or the days of an interval), 1 to 5 for month, day, hour, minute and
+    /// second, 6 to 11 for the digits of the microseconds.
     std::uint16_t GetUnknown() const noexcept { return fUnknown; }
 
   private:

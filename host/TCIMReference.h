@@ -15,63 +15,66 @@ class ICIMNamespace;
 
 /// An object path: the namespace that it belongs to, a class and a set of key bindings (DSP0004, 8.2 "Identifying CIM objects").
 ///
-/// A value type; copies share their contents until one of them is changed, so copying allocates nothing. The namespace is held
-/// weakly, so that a namespace may store references into itself; its name is kept. The class is held.
-/// Threads: distinct objects may be used at once, also when they share contents.
+/// A value type. Copies share their contents until one of them is changed, so copying allocates nothing. The path holds its class,
+/// but its namespace only weakly, because a namespace may store references into itself. The namespace's name is kept.
+/// Threads: different objects may be used concurrently, even if they share contents.
 class TCIMReference {
   public:
     /// A path without namespace, class and keys; its text is empty.
     TCIMReference();
-    /// A path in `ns` (null: in no namespace) with the given bindings and no class yet.
+    /// A path in `ns`, or in no namespace for null, with the given bindings and no class yet.
+    /// Errors: as AddKeyValue.
     TCIMReference(boost::shared_ptr<ICIMNamespace> ns, std::map<std::string, TCIMValue> keys);
     TCIMReference(const TCIMReference& other) noexcept;
     TCIMReference& operator=(const TCIMReference& other) noexcept;
     ~TCIMReference();
 
-    /// Adds one binding. A name that is bound already (in whatever letter case) gets the new value and keeps its place.
-    /// Errors: status 5 where references stand more than twelve deep in one another's bindings.
+    /// Adds one binding. A name that is bound already, in any letter case, gets the new value and keeps its spelling.
+    /// Errors: kInvalidParameter (5) if references are nested more than twelve deep in one another's bindings.
     void AddKeyValue(const std::string& name, const TCIMValue& value);
 
-    /// Calls `callback` for each binding, as a (name, value) pair, in the order of GetPath, until it returns false.
+    /// Calls `callback` with each binding, as a pair of name and value, in the order of GetPath, until it returns false.
     void EnumerateKeyBindings(const boost::function<bool(std::pair<std::string, TCIMValue>)>& callback) const;
 
-    /// The class; for a class that nobody declared a stub of that name without properties; null only where none was ever set.
+    /// The class. A name that no namespace declared gives a stub: a class of that name without properties. Null if the path has no
+    /// class.
     boost::shared_ptr<ICIMClass> GetClass() const;
-    /// Null takes the class away.
+    /// Null removes the class.
     void SetClass(boost::shared_ptr<ICIMClass> cls);
 
     /// The path's text: `root/cimv2:Class.Key1="v",Key2=5` (DSP0207, untyped, without authority).
     ///
-    /// Without a namespace `Class.Key1="v",Key2=5`, without keys `Class`; a host stands in front as `//host/root/cimv2:...`.
-    /// Bindings in ascending order of their names (compared in lower case), names as declared; text and datetimes in double
-    /// quotes with `\` and `"` escaped by `\`; char16 in single quotes with `\` and `'` escaped; TRUE and FALSE; references as
-    /// quoted path text; reals in their shortest exact form; null as NULL. One pass, one buffer.
+    /// A path without a namespace is `Class.Key1="v",Key2=5`, one without keys `Class`, one with a host `//host/root/cimv2:...`.
+    /// Bindings come in ascending order of their names in lower case; names keep their spelling. Text, datetimes and the paths of
+    /// references are in double quotes, with `\` in front of each `"` and `\`; char16 is in single quotes, with `\` in front of `'`
+    /// and `\`. Booleans are TRUE and FALSE, reals have the shortest text that reads back the same, null is NULL. One pass.
     std::string GetPath() const;
     /// The same text, appended to `out`.
     void AppendPath(std::string& out) const;
 
-    /// The namespace, or null where there is none or it is gone.
+    /// The namespace; null if there is none or it is gone.
     boost::shared_ptr<ICIMNamespace> GetNamespace() const;
-    /// Empty where there is none. Names are kept as written, slashes in front and behind taken off.
+    /// Empty if there is none.
     const std::string& GetNamespaceName() const;
+    /// Slashes at both ends are removed. A name other than the present one, letter case aside, also removes the namespace.
     void SetNamespaceName(const std::string& name);
-    /// Empty where there is none.
+    /// Empty if there is none.
     const std::string& GetHost() const;
     void SetHost(const std::string& host);
-    /// The class's name; empty where there is none. Works for stubs too.
+    /// The class's name, also that of a stub; empty if there is no class.
     const std::string& GetClassName() const;
-    /// Gives the path a stub class of that name, to be used where the class is not at hand.
+    /// Sets a stub class of that name, for a caller that does not have the class. An empty name removes the class.
     void SetClassName(const std::string& name);
     std::size_t GetKeyCount() const;
-    /// The value bound to `name` (letter case does not count), or null. Valid until the path is changed.
+    /// The value bound to `name`, in any letter case, or null. Valid until the path changes.
     const TCIMValue* FindKeyValue(const std::string& name) const;
 
-    /// Reads a path's text, also with a slash or `//host/` in front (DSP0207), and `namespace:` missing or not.
+    /// Reads a path's text, with or without a leading slash or `//host/` (DSP0207) and with or without `namespace:`.
     ///
-    /// Bound text may carry any escaped character. Numbers become uint64, sint64 (with a sign) or real64; quoted text becomes a
-    /// string. The store converts such values to a key's declared type when it looks a path up. `ns`, where it is not null, is the
-    /// namespace whose declared class the path gets; otherwise, or where it has none, the class is a stub.
-    /// Errors: TZELException with status 9 where the text is no path; `errorPosition`, where given, then holds the byte offset.
+    /// In quotes any character may have a `\` in front. A number becomes uint64, sint64 (if it has a sign) or real64, text in
+    /// double quotes a string; the store converts them to the key's declared type when it looks the path up. The path gets the
+    /// class that `ns` declares. If `ns` is null or does not declare it, the path gets a stub. Errors: TZELException with
+    /// kParseError (9) if the text is no path; `errorPosition`, if not null, then gets the byte offset.
     static TCIMReference Parse(const std::string& text, boost::shared_ptr<ICIMNamespace> ns = boost::shared_ptr<ICIMNamespace>(),
                                std::size_t* errorPosition = nullptr);
 
@@ -81,10 +84,10 @@ class TCIMReference {
 
     explicit TCIMReference(TContents* contents) noexcept;
     TContents& Own();
-    /// The length of the path's text where nothing in it needs an escape.
+    /// The approximate length of the path's text; a text in need of many escapes is longer.
     std::size_t EstimateLength() const;
 
-    TContents* fContents;  // counted; null stands for the empty path
+    TContents* fContents;  // reference-counted; null means the empty path
 };
 
 }  // namespace NORVZEL20

@@ -14,11 +14,11 @@ class TEmbeddedObject;
 
 /// A CIM-typed value, or null (DSP0004, 5.2 "Data types").
 ///
-/// Cost: 16 bytes; copying allocates nothing (numbers and text of up to 13 bytes are held inside, longer text, arrays,
-/// references and embedded objects are immutable and shared by reference count).
-/// Threads: distinct objects may be used by distinct threads at once, also when they share contents.
-/// Errors: constructors that hold text or several elements may throw std::bad_alloc; accessors and conversions throw
-/// TZELException with status 13 (type mismatch) where the value is null or of a type they do not accept.
+/// Cost: 16 bytes; copying allocates nothing. Numbers and text of up to 13 bytes are held inside the value; longer text, arrays,
+/// references and embedded objects are immutable and shared by reference count.
+/// Threads: different objects may be used concurrently, even if they share contents.
+/// Errors: constructors that take text or several elements may throw std::bad_alloc; accessors and conversions throw
+/// TZELException with kTypeMismatch (13) if the value is null or of a type that they do not accept.
 class alignas(8) TCIMValue {
   public:
     /// The type of a value; converts to and from the bare enumeration.
@@ -26,7 +26,7 @@ class alignas(8) TCIMValue {
       public:
         /// The code of an array type is that of its element type plus kArray.
         enum ECIMType : unsigned char {
-            kNone = 0,  ///< no type: a null of which nothing more is known
+            kNone = 0,  ///< the type of a null that has no type
             kBoolean = 1,
             kUint8 = 2,
             kSint8 = 3,
@@ -39,7 +39,7 @@ class alignas(8) TCIMValue {
             kReal32 = 10,  ///< IEEE 754 binary32
             kReal64 = 11,  ///< IEEE 754 binary64
             kChar16 = 12,  ///< one UCS-2 code unit
-            kString = 13,  ///< UTF-8; also carries embedded objects
+            kString = 13,  ///< text in UTF-8, or an embedded object
             kDateTime = 14,
             kReference = 15,
             kArray = 16,  ///< added to an element type; never a type by itself
@@ -66,10 +66,10 @@ class alignas(8) TCIMValue {
         /// True for the codes above kArray.
         bool IsArray() const noexcept { return fType > kArray; }
 
-        /// The type of one element; the type itself where it is no array.
+        /// The type of one element; the type itself if it is no array.
         TCIMType GetElementType() const noexcept { return IsArray() ? ECIMType(fType - kArray) : fType; }
 
-        /// The type of an array of this; the type itself where it is an array already.
+        /// The type of an array of this; the type itself if it is an array already.
         TCIMType GetArrayType() const noexcept { return IsArray() ? fType : ECIMType(fType + kArray); }
 
       private:
@@ -80,7 +80,7 @@ class alignas(8) TCIMValue {
     TCIMValue() noexcept;
     /// A null of the given type.
     static TCIMValue Null(TCIMType type) noexcept;
-    /// A type is no value: Null makes a null of it.
+    /// A type is no value. Use Null for a null of that type.
     TCIMValue(TCIMType::ECIMType type) = delete;
 
     TCIMValue(const TCIMValue& other) noexcept;
@@ -106,13 +106,14 @@ class alignas(8) TCIMValue {
     TCIMValue(const std::string& text);             ///< string; bytes are taken as they are, NUL included
     TCIMValue(const char* text);                    ///< string, up to the first NUL; must not be null
     TCIMValue(const TCIMDateTime& value) noexcept;  ///< datetime
-    TCIMValue(TCIMReference& path);                 ///< reference; later changes of `path` do not show
+    TCIMValue(TCIMReference& path);                 ///< reference; later changes of `path` do not matter
     TCIMValue(const TCIMReference& path);           ///< reference
     /// A string that is an embedded instance or class (DSP0004, 5.6.3.15 "EmbeddedObject"). Null gives a null string.
     TCIMValue(boost::shared_ptr<const TEmbeddedObject> object);
 
-    /// An array of the first `count` of `elements`, all of them where there are fewer. `type` is the array's type or that of
-    /// an element. An element may be null; any other must have the element type, else status 13. An empty array is not null.
+    /// An array of the first `count` of `elements`, or of all of them if there are fewer. `type` is the array's type or that of an
+    /// element. Each element must be null or have the element type. An empty array is not null.
+    /// Errors: kTypeMismatch (13) for an element of another type and for a type that has no arrays.
     TCIMValue(TCIMType type, unsigned int count, const std::vector<TCIMValue>& elements);
 
     /// A string of the given bytes, without a std::string in between.
@@ -121,48 +122,48 @@ class alignas(8) TCIMValue {
     TCIMType GetType() const noexcept;
     bool IsNull() const noexcept;
 
-    /// Whether both are null (of whatever type), or of the same type and equal in value.
+    /// True if both are null, of any types, or have the same type and equal values.
     ///
-    /// Text byte for byte; reals by value, NaN equal to NaN and 0 to -0; datetimes as TCIMDateTime says; references by path text;
-    /// embedded objects by structure; arrays element by element in order, except that an array marked as a bag (see
-    /// AsBag) compares as a multiset when it is the left operand. Linear, for bags n log n.
+    /// Text compares byte for byte; reals by value, with NaN equal to NaN and 0 to -0; datetimes as in TCIMDateTime; references by
+    /// path text; embedded objects by structure; arrays element by element. If the left operand is a bag (see AsBag), the order of
+    /// the elements does not matter. Linear; for bags n log n.
     bool operator==(const TCIMValue& other) const;
     bool operator!=(const TCIMValue& other) const { return !(*this == other); }
 
-    /// Any integer value between 0 and 65535; everything else, null included, throws status 13.
+    /// The value of any integer between 0 and 65535. Errors: kTypeMismatch (13) for everything else, null included.
     operator unsigned short() const;
-    /// The path of a reference value; everything else, null included, throws status 13.
+    /// The path of a reference. Errors: kTypeMismatch (13) for everything else, null included.
     operator TCIMReference() const;
 
-    /// Exact accessors: each accepts its own type alone, else status 13.
+    /// The accessors convert nothing. Errors: kTypeMismatch (13) for a null and for any type but their own.
     bool GetBoolean() const;
     std::uint64_t GetUnsigned() const;  ///< uint8 to uint64
     std::int64_t GetSigned() const;     ///< sint8 to sint64
-    double GetReal() const;             ///< real32 (exactly) and real64
+    double GetReal() const;             ///< real32 and real64
     char16_t GetChar16() const;
-    std::string_view GetString() const;  ///< string without an embedded object; valid while this value lives unchanged
+    std::string_view GetString() const;  ///< string without an embedded object; valid until this value changes
     TCIMDateTime GetDateTime() const;
 
-    /// The embedded object of a string value, or null where it holds plain text or is null. Status 13 for other types.
+    /// The embedded object of a string; null if the value is plain text or a null. Errors: kTypeMismatch (13) for other types.
     boost::shared_ptr<const TEmbeddedObject> GetEmbeddedObject() const;
 
-    /// The elements of an array, valid while this value lives unchanged. Status 13 for anything else, null included.
+    /// The elements of an array. Valid until this value changes. Errors: kTypeMismatch (13) for everything else, null included.
     const std::vector<TCIMValue>& GetElements() const;
 
-    /// The same array, marked to compare as a multiset where it is the left operand (the qualifier ArrayType "Bag").
-    /// Values that are no arrays, and nulls, come back as they are. The mark does not show in texts.
+    /// The same array as a bag (qualifier ArrayType "Bag"): as the left operand of a comparison it is equal to every array with the
+    /// same elements, whatever their order. A null, or a value that is no array, comes back unchanged. Texts do not show the mark.
     TCIMValue AsBag() const;
     bool IsBag() const noexcept;
 
-    /// The value for people and reports: text unquoted, numbers in decimal (reals in their shortest exact form), TRUE and FALSE,
-    /// datetimes in their 25 characters, references as paths, embedded objects as CIM-XML, arrays as {a, b} with text quoted,
-    /// null as NULL. Does not tell apart what differs in type alone.
+    /// The value for people and reports: text unquoted, numbers in decimal (reals in the shortest text that reads back the same),
+    /// TRUE and FALSE, datetimes in their 25 characters, references as paths, embedded objects as CIM-XML, arrays as {a, b} with
+    /// text quoted, null as NULL. Values that differ only in type may have the same text.
     std::string ToText() const;
 
-    /// Appends the value as a key binding of a path carries it (see TCIMReference::GetPath).
+    /// Appends the value in the form that it has in a path (see TCIMReference::GetPath).
     void AppendKeyText(std::string& out) const;
 
-    /// A hash that agrees with operator== for values of one type, except that a bag hashes by order.
+    /// Equal values of the same type have the same hash, except bags: their hash depends on the order of the elements.
     std::size_t Hash() const;
 
   private:
@@ -173,7 +174,7 @@ class alignas(8) TCIMValue {
 
     TCIMType::ECIMType fType;
     unsigned char fForm;
-    unsigned char fBytes[14];  // a number or a pointer from offset 6 on (offset 8 of the whole), or a length and short text
+    unsigned char fBytes[14];  // the contents; their layout depends on fForm
 };
 
 }  // namespace NORVZEL20

@@ -8,17 +8,19 @@
 
 namespace NORVZEL20 {
 
-/// The host's registry of namespace providers, one in a process. "inmem" is there from the start.
+/// The host's registry of namespace providers, one in each process. The provider "inmem" is registered from the start.
 ///
 /// The order of the virtual operations is part of the contract: registration, then look-up.
 /// Threads: any, at any time.
 class TNamespaceProviderManager : public INamespaceProviderManager {
   public:
+    /// Never null.
     static boost::shared_ptr<TNamespaceProviderManager> GetInstance();
 
+    /// Also returns kInvalidParameter (5) for null.
     TZELStatusCode RegisterProvider(boost::shared_ptr<INamespaceProvider> provider) override;
 
-    /// The provider registered under `name`, byte for byte, or null.
+    /// The provider that is registered under exactly this name, letter case included; null if there is none.
     virtual boost::shared_ptr<INamespaceProvider> FindProvider(const std::string& name);
 
     /// The names of all providers, in order of registration.

@@ -7,15 +7,15 @@
 
 namespace NORVZEL20 {
 
-/// The way to the host's services.
+/// Gives access to the host's services.
 class TRootObject {
   public:
     TRootObject() = delete;
 
-    /// Never null, from the first use on, static initialisers of other libraries included.
+    /// Never null. May be called at any time, also from static initialisers of other libraries.
     static boost::shared_ptr<INamespaceProviderManager> GetNamespaceProviderManager();
 
-    /// The core log; not owned, valid until the process ends.
+    /// The core log. Never null; not owned; valid until the process ends.
     static ILogger* GetCoreLogger();
 };
 

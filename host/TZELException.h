@@ -6,7 +6,7 @@
 
 namespace NORVZEL20 {
 
-/// The one failure of the object model: a status, thrown by value.
+/// The exception that every operation of the object model throws: a status. Throw it by value.
 class TZELException : public std::exception {
   public:
     explicit TZELException(TZELStatusCode status) noexcept;
@@ -14,7 +14,7 @@ class TZELException : public std::exception {
     TZELException& operator=(const TZELException& other) noexcept = default;
     ~TZELException() noexcept override;
 
-    /// The characters of the status's text.
+    /// The text of the status.
     const char* what() const noexcept override;
 
     TZELStatusCode GetStatusCode() const noexcept { return fStatusCode; }
