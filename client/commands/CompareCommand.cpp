@@ -2,6 +2,7 @@
 
 #include "client/comparison/TComparison.h"
 #include "client/inventory/TInventoryLoader.h"
+#include "client/process/ExitStatus.h"
 #include "client/report/CimXmlFormat.h"
 #include "client/report/JsonFormat.h"
 #include "client/report/ResultOutput.h"
@@ -35,7 +36,7 @@ int RunCompare(const TCompareOptions& options, IConsole& console)
     std::vector<TInventory> inventories = TInventoryLoader(console).Load(paths);
     const TComparisonReport report = TComparison(inventories, console).Run(options.rules, options.strictSchema);
     DeliverResult(console, options.output, Write(report, options.format, console.IsColored() && IsStandardOutput(options.output)));
-    return report.differences.empty() ? 0 : 1;
+    return report.differences.empty() ? kExitSuccess : kExitDifferences;
 }
 
 }  // namespace NORVZEL20

@@ -2,6 +2,7 @@
 
 #include "client/inventory/CompleteInventories.h"
 #include "client/inventory/TInventoryLoader.h"
+#include "client/process/ExitStatus.h"
 #include "client/report/ResultOutput.h"
 #include "client/report/TRulesListing.h"
 
@@ -17,7 +18,7 @@ int RunExplain(const TExplainOptions& options, IConsole& console)
                   dot == std::string::npos
                       ? listing.WriteExplanation(options.element)
                       : listing.WriteExplanation(options.element.substr(0, dot), options.element.substr(dot + 1)));
-    return 0;
+    return kExitSuccess;
 }
 
 }  // namespace NORVZEL20

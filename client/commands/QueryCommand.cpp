@@ -1,6 +1,7 @@
 #include "client/commands/QueryCommand.h"
 
 #include "client/inventory/TInventoryLoader.h"
+#include "client/process/ExitStatus.h"
 #include "client/process/TClientError.h"
 #include "client/report/InstanceListing.h"
 #include "client/report/ResultOutput.h"
@@ -22,7 +23,7 @@ int RunQuery(const TQueryOptions& options, IConsole& console)
     } catch (const TQueryError& error) {
         throw TClientError(error.what());
     }
-    return 0;
+    return kExitSuccess;
 }
 
 }  // namespace NORVZEL20

@@ -1,6 +1,7 @@
 #include "client/commands/ShowCommand.h"
 
 #include "client/inventory/TInventoryLoader.h"
+#include "client/process/ExitStatus.h"
 #include "client/process/TClientError.h"
 #include "client/report/InstanceListing.h"
 #include "client/report/ResultOutput.h"
@@ -30,7 +31,7 @@ int RunShow(const TShowOptions& options, IConsole& console)
     const TInventory inventory = TInventoryLoader(console).LoadOne(options.inventory);
     DeliverResult(console, options.output,
                   options.className.empty() ? WriteClasses(inventory, options.format) : WriteClass(inventory, options));
-    return 0;
+    return kExitSuccess;
 }
 
 }  // namespace NORVZEL20
