@@ -12,14 +12,14 @@
 #include "client/commands/ExplainCommand.h"
 #include "client/commands/QueryCommand.h"
 #include "client/commands/ShowCommand.h"
+#include "client/process/ExitStatus.h"
 #include "client/process/LackOfMemory.h"
+#include "client/process/TReaderGone.h"
 #include "client/report/OutputFormats.h"
 
 namespace NORVZEL20 {
 
 namespace {
-
-const int kTrouble = 2;
 
 const char kInventoryHelp[] = "CIM-XML, plain or compressed with gzip, xz or zstd; - is standard input";
 
@@ -88,7 +88,7 @@ class TCommandLine {
         std::ostringstream err;
         if (fApp.exit(error, out, err) == 0) {
             console.WriteResult(out.str());
-            return 0;
+            return kExitSuccess;
         }
         const std::vector<CLI::App*> chosen = fApp.get_subcommands();
         if (chosen.empty()) {
@@ -96,7 +96,7 @@ class TCommandLine {
         } else {
             console.Say("cimdelta: " + Unguard(error.what()) + "; see cimdelta " + chosen[0]->get_name() + " --help");
         }
-        return kTrouble;
+        return kExitTrouble;
     }
 
     CLI::App* AddCommand(const char* name, const char* description, std::function<int(IConsole&)> run)
@@ -215,15 +215,14 @@ int RunClient(int argc, const char* const* argv, IConsole& console) noexcept
 {
     try {
         return TCommandLine().Run(argc, argv, console);
+    } catch (const TReaderGone&) {
+        // Nobody waits for a message either.
     } catch (const std::bad_alloc&) {
         console.Say(kNoMemory);
     } catch (const std::exception& error) {
-        // An empty text: whoever read the result went away, and nobody needs to be told.
-        if (*error.what() != '\0') {
-            Complain(console, error.what());
-        }
+        Complain(console, error.what());
     }
-    return kTrouble;
+    return kExitTrouble;
 }
 
 }  // namespace NORVZEL20

@@ -5,10 +5,8 @@
 #include <sys/stat.h>
 #include <unistd.h>
 
-#include <cerrno>
-#include <cstring>
-
 #include "client/process/StandardDescriptors.h"
+#include "client/process/SystemError.h"
 #include "client/process/TClientError.h"
 
 namespace NORVZEL20 {
@@ -22,7 +20,8 @@ int OpenFile(const std::string& path)
     }
     const int descriptor = open(path.c_str(), O_RDONLY | O_CLOEXEC);
     if (descriptor < 0) {
-        throw TClientError(path + ": cannot be opened: " + std::strerror(errno));
+        const std::error_code reason = LastSystemError();
+        throw TClientError(path + ": cannot be opened", reason);
     }
     struct stat status;
     if (fstat(descriptor, &status) == 0 && S_ISDIR(status.st_mode)) {
@@ -75,13 +74,14 @@ std::size_t TInputFile::ReadDescriptor(char* buffer, std::size_t size)
         if (count >= 0) {
             return static_cast<std::size_t>(count);
         }
-        if (errno == EAGAIN) {
+        const std::error_code reason = LastSystemError();
+        if (reason == std::errc::resource_unavailable_try_again) {
             pollfd wait = {fDescriptor, POLLIN, 0};
             poll(&wait, 1, -1);
-        } else if (errno == EBADF && IsClosed(fDescriptor)) {
+        } else if (reason == std::errc::bad_file_descriptor && IsClosed(fDescriptor)) {
             throw TClientError(fName + ": cannot be read: it is closed");
-        } else if (errno != EINTR) {
-            throw TClientError(fName + ": cannot be read: " + std::strerror(errno));
+        } else if (reason != std::errc::interrupted) {
+            throw TClientError(fName + ": cannot be read", reason);
         }
     }
 }

@@ -2,14 +2,14 @@
 
 #include <stdlib.h>
 
-#include <cstring>
-
 #include "client/process/TClientError.h"
-#include "client/process/WholeWrite.h"
+#include "client/process/WriteWhole.h"
 
 namespace NORVZEL20 {
 
 namespace {
+
+const char kAdvice[] = "; TMPDIR names the folder";
 
 std::string Begin()
 {
@@ -17,20 +17,24 @@ std::string Begin()
     return std::string(folder == nullptr || *folder == '\0' ? "/tmp" : folder) + "/cimdelta-";
 }
 
+TUnfinishedFile MakeFile(const std::string& begin)
+{
+    try {
+        return TUnfinishedFile(begin);
+    } catch (const std::system_error& error) {
+        throw TClientError(begin + "XXXXXX: no temporary file can be made", error.code(), kAdvice);
+    }
+}
+
 }  // namespace
 
-TTemporaryFile::TTemporaryFile(const std::string& content) : fFile(Begin())
+TTemporaryFile::TTemporaryFile(const std::string& content) : fFile(MakeFile(Begin()))
 {
-    if (fFile.GetError() != 0) {
-        throw TClientError(fFile.GetPath() + ": no temporary file can be made: " + std::strerror(fFile.GetError()) +
-                           "; TMPDIR names the folder");
-    }
-    int error = WriteWhole(fFile.GetDescriptor(), content);
-    if (error == 0) {
-        error = fFile.Close();
-    }
-    if (error != 0) {
-        throw TClientError(fFile.GetPath() + ": cannot be written: " + std::strerror(error) + "; TMPDIR names the folder");
+    try {
+        WriteWhole(fFile.GetDescriptor(), content);
+        fFile.Close();
+    } catch (const std::system_error& error) {
+        throw TClientError(fFile.GetPath() + ": cannot be written", error.code(), kAdvice);
     }
 }
 

@@ -6,10 +6,11 @@
 
 namespace NORVZEL20 {
 
-/// A file of its own name that is gone when this object is, or when a signal ends the process.
+/// A file with a name of its own that is removed when this object is destroyed, or when a signal ends the process.
 class TTemporaryFile {
   public:
-    /// Makes a file with that content in the folder that TMPDIR names, else in /tmp. Errors: TClientError.
+    /// Makes a file with that content in the folder that the environment variable TMPDIR names, or in /tmp if it names none.
+    /// Errors: TClientError.
     explicit TTemporaryFile(const std::string& content);
     TTemporaryFile(const TTemporaryFile&) = delete;
     TTemporaryFile& operator=(const TTemporaryFile&) = delete;

@@ -1,39 +1,42 @@
 #pragma once
 
 #include <string>
+#include <system_error>
 
 namespace NORVZEL20 {
 
-/// A new file that is gone when this object is, or when a signal ends the process, unless it has got its place by then.
+/// A new file that is removed when this object is destroyed, or when a signal ends the process, unless MoveTo has given it its
+/// final name by then.
 ///
-/// Threads: distinct files at once; made by the thread that gets the signals (see TSignalsHeld).
+/// Threads: different files may be used concurrently. Construct them in the thread that receives the signals (see TSignalsHeld).
 class TUnfinishedFile {
   public:
-    /// Makes an empty file, readable by its owner alone, whose path begins with `begin`. Errors: GetError.
+    /// Makes an empty file, readable by its owner alone, whose path is `begin` and six characters more.
+    /// Errors: std::system_error; there is no file then.
     explicit TUnfinishedFile(const std::string& begin);
     TUnfinishedFile(const TUnfinishedFile&) = delete;
     TUnfinishedFile& operator=(const TUnfinishedFile&) = delete;
     ~TUnfinishedFile();
 
-    /// 0, or errno of what went wrong in making it: then there is no file.
-    int GetError() const { return fError; }
     const std::string& GetPath() const { return fPath; }
+    /// Open for writing until Close.
     int GetDescriptor() const { return fDescriptor; }
 
-    /// Closes the descriptor. Returns 0 or errno.
-    int Close() noexcept;
-    /// Gives the file its final name, whatever is there by that name. Returns 0 or errno.
-    int MoveTo(const std::string& path) noexcept;
+    /// Closes the descriptor, if it is still open. Errors: std::system_error; it is closed all the same.
+    void Close();
 
-    /// Removes every such file there is. Made for signal handlers: calls nothing that they must not.
+    /// Gives the file its final name in place of whatever has that name. Errors: std::system_error; the file is still unfinished.
+    void MoveTo(const std::string& path);
+
+    /// Removes the unfinished files of the process, eight at most. A signal handler may call it: it takes no lock and no memory.
     static void RemoveAll() noexcept;
 
   private:
+    std::error_code CloseDescriptor() noexcept;
     void Forget() noexcept;
 
     std::string fPath;
     int fDescriptor = -1;
-    int fError = 0;
     bool fIsThere = false;
     int fSlot = -1;
 };

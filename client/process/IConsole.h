@@ -12,8 +12,8 @@ class IConsole {
   public:
     virtual ~IConsole() = default;
 
-    /// Writes a whole result to standard output. Errors: TClientError where it does not get there, with an empty text where the
-    /// reader has closed the pipe or standard output is closed.
+    /// Writes a whole result to standard output. Errors: TReaderGone if the reader has closed the pipe or standard output is
+    /// closed; TClientError if it cannot be written for another reason.
     virtual void WriteResult(const std::string& text) = 0;
 
     /// Writes one line, without its end, to standard error, with escapes in place of what could move a terminal. Never throws, not

@@ -7,7 +7,8 @@
 #include <new>
 #include <string_view>
 
-#include "client/process/WholeWrite.h"
+#include "client/process/ExitStatus.h"
+#include "client/process/WriteWhole.h"
 
 namespace NORVZEL20 {
 
@@ -15,7 +16,6 @@ const char* const kNoMemory = "cimdelta: not enough memory";
 
 namespace {
 
-const int kTrouble = 2;
 void (*gCleanUp)() = nullptr;
 
 bool IsLackOfMemory() noexcept
@@ -35,9 +35,9 @@ bool IsLackOfMemory() noexcept
         std::abort();
     }
     gCleanUp();
-    WriteWhole(STDERR_FILENO, kNoMemory);
-    WriteWhole(STDERR_FILENO, "\n");
-    _exit(kTrouble);
+    TryWriteWhole(STDERR_FILENO, kNoMemory);
+    TryWriteWhole(STDERR_FILENO, "\n");
+    _exit(kExitTrouble);
 }
 
 }  // namespace

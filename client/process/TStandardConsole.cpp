@@ -2,13 +2,13 @@
 
 #include <unistd.h>
 
-#include <cerrno>
 #include <cstdlib>
 #include <cstring>
 
 #include "client/process/StandardDescriptors.h"
 #include "client/process/TClientError.h"
-#include "client/process/WholeWrite.h"
+#include "client/process/TReaderGone.h"
+#include "client/process/WriteWhole.h"
 #include "client/text/DisplayText.h"
 
 namespace NORVZEL20 {
@@ -34,9 +34,9 @@ void SayPlainly(std::string_view line) noexcept
 {
     for (const char character : line) {
         const bool isPlain = character >= ' ' && character <= '~';
-        WriteWhole(STDERR_FILENO, std::string_view(isPlain ? &character : "?", 1));
+        TryWriteWhole(STDERR_FILENO, std::string_view(isPlain ? &character : "?", 1));
     }
-    WriteWhole(STDERR_FILENO, "\n");
+    TryWriteWhole(STDERR_FILENO, "\n");
 }
 
 }  // namespace
@@ -47,12 +47,12 @@ TStandardConsole::TStandardConsole()
 
 void TStandardConsole::WriteResult(const std::string& text)
 {
-    const int error = WriteWhole(STDOUT_FILENO, text);
-    if (error == EPIPE || (error == EBADF && IsClosed(STDOUT_FILENO))) {
-        throw TClientError("");
+    const std::error_code error = TryWriteWhole(STDOUT_FILENO, text);
+    if (error == std::errc::broken_pipe || (error == std::errc::bad_file_descriptor && IsClosed(STDOUT_FILENO))) {
+        throw TReaderGone();
     }
-    if (error != 0) {
-        throw TClientError(std::string("standard output cannot be written: ") + std::strerror(error));
+    if (error) {
+        throw TClientError("standard output cannot be written", error);
     }
 }
 
@@ -60,11 +60,11 @@ void TStandardConsole::Say(std::string_view line) noexcept
 {
     const std::lock_guard<std::mutex> lock(fMutex);
     if (fProgressShown) {
-        WriteWhole(STDERR_FILENO, kWipeLine);
+        TryWriteWhole(STDERR_FILENO, kWipeLine);
         fProgressShown = false;
     }
     try {
-        WriteWhole(STDERR_FILENO, EscapeForDisplay(line) + "\n");
+        TryWriteWhole(STDERR_FILENO, EscapeForDisplay(line) + "\n");
     } catch (const std::exception&) {
         SayPlainly(line);
     }
@@ -74,8 +74,8 @@ void TStandardConsole::ShowProgress(std::string_view text) noexcept
 {
     const std::lock_guard<std::mutex> lock(fMutex);
     if (fProgress && (fProgressShown || !text.empty())) {
-        WriteWhole(STDERR_FILENO, kWipeLine);
-        WriteWhole(STDERR_FILENO, text);
+        TryWriteWhole(STDERR_FILENO, kWipeLine);
+        TryWriteWhole(STDERR_FILENO, text);
         fProgressShown = !text.empty();
     }
 }

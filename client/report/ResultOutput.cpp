@@ -1,3 +1,12 @@
+// How a result reaches the place that the person named with --output.
+//
+// A path can lead to three kinds of places. Links are followed by hand, one at a time, because the last one may lead to a file
+// that does not exist yet, and because a link below /proc/self/fd (/dev/stdout is one) stands for an open descriptor:
+//   an open descriptor    is written to as it is, so that the shell's >> still appends;
+//   a device or a pipe    is opened and written to;
+//   an ordinary file      is replaced: the text goes to a temporary file in the same folder (a rename cannot leave its file
+//                         system), which gets the old file's owner and rights, is synced, and takes the name over by rename().
+// Whatever fails or ends the process before the rename leaves the old file as it was.
 #include "client/report/ResultOutput.h"
 
 #include <fcntl.h>
@@ -6,24 +15,21 @@
 #include <sys/stat.h>
 #include <unistd.h>
 
-#include <cerrno>
-#include <cstring>
+#include <charconv>
+#include <optional>
 
 #include "client/files/TUnfinishedFile.h"
+#include "client/process/SystemError.h"
 #include "client/process/TClientError.h"
-#include "client/process/WholeWrite.h"
+#include "client/process/TReaderGone.h"
+#include "client/process/WriteWhole.h"
 
 namespace NORVZEL20 {
 
 namespace {
 
+// As many as Linux follows in one path.
 const int kMostLinks = 40;
-const int kNone = -1;
-
-[[noreturn]] void Fail(const std::string& path, int error)
-{
-    throw TClientError(path + ": cannot be written: " + std::strerror(error));
-}
 
 // The folder of a path, with the slash behind it; empty for the current one.
 std::string FolderOf(const std::string& path)
@@ -37,25 +43,32 @@ std::string RealPath(const std::string& path)
     return realpath(path.c_str(), real) == nullptr ? std::string() : real;
 }
 
-// The descriptor of this process that a path such as /dev/stdout leads to, by its name below /proc/self/fd; else kNone.
-int DescriptorNamed(const std::string& path)
+std::optional<int> NumberOf(std::string_view text)
+{
+    int number = 0;
+    const std::from_chars_result read = std::from_chars(text.data(), text.data() + text.size(), number);
+    return read.ec == std::errc() ? std::optional<int>(number) : std::nullopt;
+}
+
+// The descriptor of this process that a link such as /proc/self/fd/1 stands for, if it is one of those links.
+std::optional<int> DescriptorNamed(const std::string& path)
 {
     const std::string folder = RealPath("/proc/self/fd");
     if (folder.empty() || RealPath(FolderOf(path)) != folder) {
-        return kNone;
+        return std::nullopt;
     }
-    return atoi(path.c_str() + FolderOf(path).size());
+    return NumberOf(std::string_view(path).substr(FolderOf(path).size()));
 }
 
 // Where a path leads.
 struct TTarget {
-    std::string path;  ///< at the end of all links, whether there is a file or not, so that the links stay
-    int descriptor;    ///< of this process, else kNone
+    std::string path;               ///< at the end of all links, whether or not there is a file
+    std::optional<int> descriptor;  ///< the open descriptor that it stands for, if it does
 };
 
 TTarget FollowLinks(const std::string& path)
 {
-    TTarget target = {path, kNone};
+    TTarget target = {path, std::nullopt};
     char link[PATH_MAX];
     for (int links = 0; links < kMostLinks; ++links) {
         const ssize_t length = readlink(target.path.c_str(), link, sizeof link);
@@ -63,90 +76,73 @@ TTarget FollowLinks(const std::string& path)
             return target;
         }
         target.descriptor = DescriptorNamed(target.path);
-        if (target.descriptor != kNone) {
+        if (target.descriptor) {
             return target;
         }
         const std::string next(link, static_cast<std::size_t>(length));
         target.path = next[0] == '/' ? next : FolderOf(target.path) + next;
     }
-    Fail(path, ELOOP);
+    throw std::system_error(ELOOP, std::generic_category());
 }
 
-// A device or a pipe is written to, not replaced.
+// Whether the path names something that is written to rather than replaced: a device or a pipe.
 bool IsSpecial(const std::string& path)
 {
     struct stat status;
     return stat(path.c_str(), &status) == 0 && !S_ISREG(status.st_mode);
 }
 
-// A reader that is gone needs to be told nothing.
-void CheckWritten(const std::string& path, int error)
-{
-    if (error == EPIPE) {
-        throw TClientError("");
-    }
-    if (error != 0) {
-        Fail(path, error);
-    }
-}
-
 void WriteSpecial(const std::string& path, const std::string& text)
 {
     const int descriptor = open(path.c_str(), O_WRONLY | O_CLOEXEC);
-    if (descriptor < 0) {
-        Fail(path, errno);
+    ThrowIfFailed(descriptor);
+    const std::error_code writing = TryWriteWhole(descriptor, text);
+    const int closed = close(descriptor);
+    if (writing) {
+        throw std::system_error(writing);
     }
-    const int error = WriteWhole(descriptor, text);
-    const int closing = close(descriptor) != 0 ? errno : 0;
-    CheckWritten(path, error != 0 ? error : closing);
+    ThrowIfFailed(closed);
 }
 
-// Gives the file the owner and the rights of the one that it replaces, else the rights that a file made in the ordinary way would
-// have; a temporary one has fewer. Returns 0 or errno.
-int SetRights(int descriptor, const std::string& target)
+// Gives the file the owner and the rights of the one that it replaces. If there is none, gives it the rights that any new file
+// would have: a temporary file has fewer.
+void SetRights(int descriptor, const std::string& target)
 {
     struct stat status;
     mode_t mode = 0;
     if (stat(target.c_str(), &status) == 0) {
-        // Only root may give a file away; anybody else who replaces another one's file owns the new one.
+        // Only root may give a file away. If anybody else replaces another user's file, the new one is theirs.
         static_cast<void>(fchown(descriptor, status.st_uid, status.st_gid) == 0);
         mode = status.st_mode & 0777;
     } else {
+        // The mask cannot be read without setting it.
         const mode_t mask = umask(0);
         umask(mask);
         mode = 0666 & ~mask;
     }
-    return fchmod(descriptor, mode) != 0 ? errno : 0;
+    ThrowIfFailed(fchmod(descriptor, mode));
 }
 
-int WriteAndSync(TUnfinishedFile& file, const std::string& text, const std::string& target)
+void ReplaceFile(const std::string& target, const std::string& text)
 {
-    int error = WriteWhole(file.GetDescriptor(), text);
-    if (error == 0) {
-        error = SetRights(file.GetDescriptor(), target);
-    }
-    if (error != 0) {
-        return error;
-    }
-    if (fsync(file.GetDescriptor()) != 0) {
-        return errno;
-    }
-    return file.Close();
-}
-
-void WriteFile(const std::string& path, const std::string& target, const std::string& text)
-{
-    // The name's length has nothing to do with the final one's, which may be as long as names can be.
+    // A short name of its own: the final name may be as long as names can be and leave no room for a suffix.
     TUnfinishedFile file(FolderOf(target) + ".cimdelta-");
-    int error = file.GetError();
-    if (error == 0) {
-        error = WriteAndSync(file, text, target);
-    }
-    if (error == 0) {
-        error = file.MoveTo(target);
-    }
-    if (error != 0) {
-        Fail(path, error);
+    WriteWhole(file.GetDescriptor(), text);
+    SetRights(file.GetDescriptor(), target);
+    ThrowIfFailed(fsync(file.GetDescriptor()));
+    file.Close();
+    file.MoveTo(target);
+}
+
+void WriteTo(const std::string& path, const std::string& text)
+{
+    const TTarget target = FollowLinks(path);
+    if (target.descriptor) {
+        WriteWhole(*target.descriptor, text);
+    } else if (IsSpecial(path)) {
+        WriteSpecial(path, text);
+    } else {
+        ReplaceFile(target.path, text);
     }
 }
 
@@ -163,13 +159,13 @@ void DeliverResult(IConsole& console, const std::string& path, const std::string
         console.WriteResult(text);
         return;
     }
-    const TTarget target = FollowLinks(path);
-    if (target.descriptor != kNone) {
-        CheckWritten(path, WriteWhole(target.descriptor, text));
-    } else if (IsSpecial(path)) {
-        WriteSpecial(path, text);
-    } else {
-        WriteFile(path, target.path, text);
+    try {
+        WriteTo(path, text);
+    } catch (const std::system_error& error) {
+        if (error.code() == std::errc::broken_pipe) {
+            throw TReaderGone();
+        }
+        throw TClientError(path + ": cannot be written", error.code());
     }
 }
 

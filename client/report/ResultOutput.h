@@ -13,7 +13,7 @@ bool IsStandardOutput(const std::string& path);
 ///
 /// The file appears whole or not at all: the text is written beside it, then renamed; what was there before stays until then. Links
 /// are followed and stay. A device, a pipe or an open descriptor (/dev/stdout) is written to, not replaced.
-/// Errors: TClientError, with an empty text where the reader has closed the pipe.
+/// Errors: TReaderGone if the reader has closed the pipe, else TClientError.
 void DeliverResult(IConsole& console, const std::string& path, const std::string& text);
 
 }  // namespace NORVZEL20

@@ -3,10 +3,9 @@
 #include <sys/stat.h>
 
 #include <algorithm>
-#include <cerrno>
-#include <cstring>
 
 #include "client/process/LackOfMemory.h"
+#include "client/process/SystemError.h"
 #include "client/process/TClientError.h"
 #include "client/rules/RulesFault.h"
 #include "client/rules/TLogCapture.h"
@@ -25,7 +24,7 @@ void CheckFile(const std::string& file)
         throw TClientError(file + ": a rules file cannot have " + kNoRulesMarker + " in its name; rename it");
     }
     if (stat(file.c_str(), &status) != 0) {
-        throw TClientError(file + ": cannot be opened: " + std::strerror(errno));
+        throw TClientError(file + ": cannot be opened", LastSystemError());
     }
     if (!S_ISREG(status.st_mode)) {
         throw TClientError(file + ": is no regular file; save the rules to a file and name that");
