@@ -1,6 +1,7 @@
 #include "client/report/TRulesListing.h"
 
 #include <algorithm>
+#include <boost/algorithm/string/join.hpp>
 
 #include "client/comparison/TCoverage.h"
 #include "client/process/TClientError.h"
@@ -66,7 +67,7 @@ void TRulesListing::WriteElements()
     for (const TRulesDocument::TElement& element : fDocument.elements) {
         Line("  line " + std::to_string(element.line) + ": class " + element.className + ", default " +
              Verb(element.defaultTreatment) +
-             (element.excludedKeys.empty() ? "" : ", excludekeys " + Join(element.excludedKeys, " ")));
+             (element.excludedKeys.empty() ? "" : ", excludekeys " + boost::algorithm::join(element.excludedKeys, " ")));
         for (const TRulesDocument::TListed& listed : element.listed) {
             Line("    line " + std::to_string(listed.line) + ": " + Verb(listed.treatment) + " " + listed.property);
         }
@@ -97,8 +98,9 @@ void TRulesListing::WriteEffective(const boost::shared_ptr<TInMemClass>& cls)
                  [&compared](const std::string& name) { return !Contains(compared, name); });
     const std::vector<std::string>& keys = fRules.ExcludedKeysOf(cls->GetName());
     Line("  " + cls->GetName() + ": " + std::to_string(all.size() - leftOut.size()) + " of " +
-         Counted(all.size(), "property", "properties") + " compared" + (leftOut.empty() ? "" : ", all but " + Join(leftOut, ", ")) +
-         (keys.empty() ? "" : "; matched without " + Join(keys, ", ")));
+         Counted(all.size(), "property", "properties") + " compared" +
+         (leftOut.empty() ? "" : ", all but " + boost::algorithm::join(leftOut, ", ")) +
+         (keys.empty() ? "" : "; matched without " + boost::algorithm::join(keys, ", ")));
 }
 
 void TRulesListing::WriteUnmatched()
@@ -139,7 +141,7 @@ std::string TRulesListing::WriteExplanation(const std::string& className)
     Line(cls->GetName() + ": " + (compared.empty() ? "not compared" : "compared") + "; default " +
          Verb(fTrace.Find(cls->GetName()).byDefault.treatment) + ", " + Origin(fTrace.Find(cls->GetName()).byDefault));
     if (!keys.empty()) {
-        Line("  matched without " + Join(keys, ", ") + " (excludekeys, " + fFile + ":" +
+        Line("  matched without " + boost::algorithm::join(keys, ", ") + " (excludekeys, " + fFile + ":" +
              std::to_string(fTrace.Find(cls->GetName()).excludedKeysLine) + ")");
     }
     for (const std::string& property : PropertyNames(*cls)) {

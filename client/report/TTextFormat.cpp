@@ -1,6 +1,7 @@
 #include "client/report/TTextFormat.h"
 
 #include <algorithm>
+#include <boost/algorithm/string/join.hpp>
 #include <numeric>
 
 #include "client/report/TextCoverage.h"
@@ -62,7 +63,7 @@ std::string TTextFormat::Kinds(const TComparisonReport::TCounts& counts) const
     if (counts.changedValues > 0) {
         kinds.push_back(Counted(counts.changedValues, "changed value") + " in " + Counted(counts.changedInstances, "instance"));
     }
-    return Join(kinds, ", ");
+    return boost::algorithm::join(kinds, ", ");
 }
 
 void TTextFormat::WriteDifferences()
@@ -112,7 +113,7 @@ std::string TTextFormat::Values(const TDifference& difference) const
     for (const TDifference::TGroup& group : difference.others) {
         groups.push_back((IsPair() ? std::string() : Labels(group.inventories) + ": ") + OneValue(difference, group.value));
     }
-    return OneValue(difference, difference.reference) + " -> " + Join(groups, " / ");
+    return OneValue(difference, difference.reference) + " -> " + boost::algorithm::join(groups, " / ");
 }
 
 // The type is told where it is what differs.
@@ -136,7 +137,7 @@ std::string TTextFormat::Labels(const std::vector<std::size_t>& inventories) con
     for (const std::size_t inventory : inventories) {
         labels.push_back(EscapeForDisplay(fReport.labels[inventory]));
     }
-    return Join(labels, ", ");
+    return boost::algorithm::join(labels, ", ");
 }
 
 std::string TTextFormat::Others() const

@@ -1,5 +1,6 @@
 #include "client/report/TextCoverage.h"
 
+#include <boost/algorithm/string/join.hpp>
 #include <map>
 #include <utility>
 
@@ -16,10 +17,10 @@ const std::size_t kMostNames = 12;
 std::string SomeOf(const std::vector<std::string>& names)
 {
     if (names.size() <= kMostNames) {
-        return Join(names, ", ");
+        return boost::algorithm::join(names, ", ");
     }
     const std::vector<std::string> first(names.begin(), names.begin() + kMostNames);
-    return Join(first, ", ") + " and " + std::to_string(names.size() - kMostNames) + " more";
+    return boost::algorithm::join(first, ", ") + " and " + std::to_string(names.size() - kMostNames) + " more";
 }
 
 // The paragraphs of the statement, one after the other.
@@ -45,7 +46,7 @@ class TStatement {
             counts.push_back(Counted(fCoverage.CountCompared(i), "instance") + " of " + Label(i));
         }
         fOut += "Compared: " + Counted(fCoverage.CountClasses(TCoverage::kCompared), "class", "classes") + "; " +
-                Join(counts, ", ") + ".\n";
+                boost::algorithm::join(counts, ", ") + ".\n";
         if (fCoverage.classesWithout > 0) {
             fOut += Counted(fCoverage.classesWithout, "class has", "classes have") + " no instances in any inventory.\n";
         }
@@ -67,7 +68,7 @@ class TStatement {
             }
         }
         if (!classes.empty()) {
-            fOut += title + ": " + Join(classes, ", ") + ".\n";
+            fOut += title + ": " + boost::algorithm::join(classes, ", ") + ".\n";
         }
     }
 
@@ -78,7 +79,7 @@ class TStatement {
         for (const std::size_t count : counts) {
             texts.push_back(std::to_string(count));
         }
-        return Join(texts, " / ");
+        return boost::algorithm::join(texts, " / ");
     }
 
     void WriteLeftOut()
@@ -103,7 +104,8 @@ class TStatement {
             if (!counts.empty()) {
                 fOut += "Instances of " + EscapeForDisplay(cls.name) +
                         " that share their key with another one, since the rules leave out " +
-                        EscapeForDisplay(Join(cls.excludedKeys, ", ")) + ": " + Join(counts, ", ") +
+                        EscapeForDisplay(boost::algorithm::join(cls.excludedKeys, ", ")) + ": " +
+                        boost::algorithm::join(counts, ", ") +
                         (cls.sharing[0] > 0 ? "; those of " + Label(0) + " were not compared.\n"
                                             : "; each was compared with the same one.\n");
             }

@@ -2,7 +2,6 @@
 
 #include <cstddef>
 #include <string>
-#include <vector>
 
 namespace NORVZEL20 {
 
@@ -16,16 +15,6 @@ inline std::string Counted(std::size_t count, const std::string& one, const std:
 inline std::string Counted(std::size_t count, const std::string& noun)
 {
     return Counted(count, noun, noun + "s");
-}
-
-/// The texts with the separator in between.
-inline std::string Join(const std::vector<std::string>& texts, const std::string& separator)
-{
-    std::string joined;
-    for (const std::string& text : texts) {
-        joined += (joined.empty() ? "" : separator) + text;
-    }
-    return joined;
 }
 
 }  // namespace NORVZEL20

@@ -2,14 +2,14 @@
 
 #include <gtest/gtest.h>
 
-#include "client/text/Counted.h"
+#include <boost/algorithm/string/join.hpp>
 
 namespace NORVZEL20 {
 namespace {
 
 std::string Labels(const std::vector<std::string>& paths)
 {
-    return Join(MakeInventoryLabels(paths), "|");
+    return boost::algorithm::join(MakeInventoryLabels(paths), "|");
 }
 
 TEST(InventoryLabels, AreFileNamesWithoutDirectoryAndSuffixes)
