@@ -35,7 +35,7 @@ def faults(root):
             shown = document.relative_to(root)
             for word in WORD.findall(text):
                 first, slash, _ = word.partition("/")
-                if slash and first in folders and re.fullmatch(r"[\w./*+-]+", word):
+                if slash and first in folders and "..." not in word and re.fullmatch(r"[\w./*+-]+", word):
                     checked += 1
                     if not exists(root, word):
                         yield f"{shown}: names {word}, which does not exist"
