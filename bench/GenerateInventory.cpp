@@ -1,3 +1,5 @@
+// Writes one of the inventories of the benchmarks to standard output.
+
 #include <cstdlib>
 #include <iostream>
 #include <string>
