@@ -62,7 +62,7 @@ std::size_t TLikePattern::ReadSet(const std::vector<char32_t>& pattern, std::siz
         }
         const bool isRange = at + 2 < pattern.size() && pattern[at + 1] == U'-' && pattern[at + 2] != U']';
         const std::size_t last = isRange ? at + 2 : at;
-        set.fRanges.emplace_back(pattern[at], pattern[last]);
+        set.ranges.emplace_back(pattern[at], pattern[last]);
         at = last + 1;
     }
     return 0;
@@ -70,12 +70,12 @@ std::size_t TLikePattern::ReadSet(const std::vector<char32_t>& pattern, std::siz
 
 bool TLikePattern::Fits(const TStep& step, char32_t character)
 {
-    if (step.fKind == TStep::kAnyCharacter) {
+    if (step.kind == TStep::kAnyCharacter) {
         return true;
     }
-    const bool isIn = std::any_of(step.fRanges.begin(), step.fRanges.end(),
+    const bool isIn = std::any_of(step.ranges.begin(), step.ranges.end(),
                                   [character](const auto& range) { return range.first <= character && character <= range.second; });
-    return isIn == (step.fKind == TStep::kOneOf);
+    return isIn == (step.kind == TStep::kOneOf);
 }
 
 bool TLikePattern::Matches(std::string_view text) const
@@ -87,7 +87,7 @@ bool TLikePattern::Matches(std::string_view text) const
     std::size_t retryAt = 0;
     bool canRetry = false;
     while (at < characters.size() || step < fSteps.size()) {
-        if (step < fSteps.size() && fSteps[step].fKind == TStep::kAnyText) {
+        if (step < fSteps.size() && fSteps[step].kind == TStep::kAnyText) {
             retryStep = ++step;
             retryAt = at;
             canRetry = true;

@@ -19,8 +19,10 @@ class TLikePattern {
 
   private:
     struct TStep {
-        enum EKind { kAnyText, kAnyCharacter, kOneOf, kNoneOf } fKind;
-        std::vector<std::pair<char32_t, char32_t>> fRanges;  ///< first and last of each
+        enum EKind { kAnyText, kAnyCharacter, kOneOf, kNoneOf };
+
+        EKind kind;
+        std::vector<std::pair<char32_t, char32_t>> ranges;  ///< first and last of each
     };
 
     static bool Fits(const TStep& step, char32_t character);

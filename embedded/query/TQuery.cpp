@@ -28,12 +28,12 @@ void RequireProperty(const TClasses& classes, const std::string& name, std::size
 
 void RequireProperties(const TClasses& classes, const TQueryCondition& condition)
 {
-    for (const auto& part : condition.fParts) {
+    for (const auto& part : condition.parts) {
         RequireProperties(classes, *part);
     }
-    for (const TQueryOperand& operand : condition.fOperands) {
-        if (!operand.fName.empty()) {
-            RequireProperty(classes, operand.fName, operand.fPosition);
+    for (const TQueryOperand& operand : condition.operands) {
+        if (!operand.name.empty()) {
+            RequireProperty(classes, operand.name, operand.position);
         }
     }
 }

@@ -11,7 +11,7 @@
 namespace NORVZEL20 {
 
 class TInMemNamespace;
-class TQueryCondition;
+struct TQueryCondition;
 
 /// A query in WQL (or the basic level of CQL, DSP0202), parsed once and answered by any namespace.
 ///

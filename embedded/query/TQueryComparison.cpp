@@ -1,6 +1,6 @@
 #include "embedded/query/TQueryComparison.h"
 
-#include "embedded/value/TValueText.h"
+#include "embedded/value/TTypeKind.h"
 #include "host/TCIMDateTime.h"
 #include "host/TCIMReference.h"
 
@@ -9,11 +9,6 @@ namespace NORVZEL20 {
 namespace {
 
 using TType = TCIMValue::TCIMType;
-
-bool IsNumber(TType type)
-{
-    return type >= TType::kUint8 && type <= TType::kReal64;
-}
 
 /// Types whose values can be written as a text literal.
 bool IsTextual(TType type)
@@ -24,18 +19,13 @@ bool IsTextual(TType type)
 /// Exact for every number: the significand of a long double has 64 bits at least.
 long double GetNumber(const TCIMValue& value)
 {
-    switch (value.GetType()) {
-    case TType::kReal32:
-    case TType::kReal64:
+    if (TTypeKind::IsReal(value.GetType())) {
         return value.GetReal();
-    case TType::kSint8:
-    case TType::kSint16:
-    case TType::kSint32:
-    case TType::kSint64:
-        return static_cast<long double>(value.GetSigned());
-    default:
-        return static_cast<long double>(value.GetUnsigned());
     }
+    if (TTypeKind::IsSigned(value.GetType())) {
+        return static_cast<long double>(value.GetSigned());
+    }
+    return static_cast<long double>(value.GetUnsigned());
 }
 
 template <class T>
@@ -85,7 +75,7 @@ bool TQueryComparison::AreComparable(TCIMValue::TCIMType a, TCIMValue::TCIMType 
         return true;
     }
     const bool isText = a == TType::kString || b == TType::kString;
-    return (IsNumber(a) && IsNumber(b)) || (isText && IsTextual(a) && IsTextual(b));
+    return (TTypeKind::IsNumber(a) && TTypeKind::IsNumber(b)) || (isText && IsTextual(a) && IsTextual(b));
 }
 
 bool TQueryComparison::AreOrdered(TCIMValue::TCIMType a, TCIMValue::TCIMType b)
@@ -108,7 +98,7 @@ TQueryComparison::EResult TQueryComparison::Compare(const TCIMValue& a, const TC
     if (a.IsNull() || b.IsNull() || HoldsObject(a) || HoldsObject(b)) {
         return kUnknown;
     }
-    if (IsNumber(a.GetType())) {
+    if (TTypeKind::IsNumber(a.GetType())) {
         return Order(GetNumber(a), GetNumber(b));
     }
     if (a.GetType() == TType::kBoolean) {

@@ -12,39 +12,38 @@ namespace NORVZEL20 {
 
 /// One side of a test: a property, or a literal.
 struct TQueryOperand {
-    std::string fName;      ///< of the property; empty for a literal
-    TCIMValue fLiteral;     ///< string, uint64, sint64, real64, boolean or null
-    std::size_t fPosition;  ///< in the query's text
-    std::size_t fOrdinal;   ///< counts the properties that the condition mentions
-    bool fIsClass = false;  ///< the class of the query itself, which ISA may ask for
+    std::string name;      ///< of the property; empty for a literal
+    TCIMValue literal;     ///< string, uint64, sint64, real64, boolean or null
+    std::size_t position;  ///< in the query's text
+    std::size_t ordinal;   ///< counts the properties that the condition mentions
+    bool isClass = false;  ///< the class of the query itself, which ISA may ask for
 };
 
 /// A condition of a query, as parsed; it knows no class yet.
-class TQueryCondition {
-  public:
+struct TQueryCondition {
     enum EKind {
-        kOr,   ///< over fParts
-        kAnd,  ///< over fParts
-        kNot,  ///< of the one in fParts
+        kOr,   ///< over parts
+        kAnd,  ///< over parts
+        kNot,  ///< of the one in parts
         kEqual,
         kNotEqual,
         kLess,
         kLessOrEqual,
         kGreater,
         kGreaterOrEqual,
-        kLike,    ///< fOperands[0] and fPattern
-        kIsNull,  ///< of fOperands[0]
-        kIsA      ///< of fOperands[0] and fClassName
+        kLike,    ///< operands[0] and pattern
+        kIsNull,  ///< of operands[0]
+        kIsA      ///< of operands[0] and className
     };
 
-    explicit TQueryCondition(EKind kind, std::size_t position) noexcept : fKind(kind), fPosition(position) {}
+    TQueryCondition(EKind ofKind, std::size_t at) noexcept : kind(ofKind), position(at) {}
 
-    EKind fKind;
-    std::size_t fPosition;
-    std::vector<std::unique_ptr<TQueryCondition>> fParts;
-    std::vector<TQueryOperand> fOperands;
-    std::unique_ptr<TLikePattern> fPattern;
-    std::string fClassName;
+    EKind kind;
+    std::size_t position;
+    std::vector<std::unique_ptr<TQueryCondition>> parts;
+    std::vector<TQueryOperand> operands;
+    std::unique_ptr<TLikePattern> pattern;
+    std::string className;
 };
 
 }  // namespace NORVZEL20

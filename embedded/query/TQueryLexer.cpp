@@ -1,6 +1,7 @@
 #include "embedded/query/TQueryLexer.h"
 
 #include "embedded/query/TQueryError.h"
+#include "embedded/value/TNameText.h"
 
 namespace NORVZEL20 {
 
@@ -14,16 +15,6 @@ bool IsSpace(char c)
 bool IsDigit(char c)
 {
     return c >= '0' && c <= '9';
-}
-
-bool IsNameStart(char c)
-{
-    return (c >= 'a' && c <= 'z') || (c >= 'A' && c <= 'Z') || c == '_' || static_cast<unsigned char>(c) >= 0x80;
-}
-
-bool IsNamePart(char c)
-{
-    return IsNameStart(c) || IsDigit(c);
 }
 
 bool IsSign(char c)
@@ -41,7 +32,7 @@ TQueryToken TQueryLexer::Next()
     if (fAt == fText.size()) {
         return TQueryToken{TQueryToken::kEnd, std::string(), fAt};
     }
-    if (IsNameStart(Peek())) {
+    if (TNameText::IsNameStart(Peek())) {
         return ReadName();
     }
     if (IsDigit(Peek()) || (IsSign(Peek()) && (IsDigit(Peek(1)) || Peek(1) == '.')) || (Peek() == '.' && IsDigit(Peek(1)))) {
@@ -56,7 +47,7 @@ TQueryToken TQueryLexer::Next()
 TQueryToken TQueryLexer::ReadName()
 {
     const std::size_t begin = fAt;
-    while (IsNamePart(Peek())) {
+    while (TNameText::IsNamePart(Peek())) {
         ++fAt;
     }
     return TQueryToken{TQueryToken::kName, fText.substr(begin, fAt - begin), begin};
@@ -68,7 +59,7 @@ TQueryToken TQueryLexer::ReadNumber()
     const std::size_t begin = fAt;
     const bool isHexadecimal = Peek() == '0' && (Peek(1) == 'x' || Peek(1) == 'X');
     ++fAt;
-    while (IsNamePart(Peek()) || Peek() == '.' ||
+    while (TNameText::IsNamePart(Peek()) || Peek() == '.' ||
            (!isHexadecimal && IsSign(Peek()) && (fText[fAt - 1] == 'e' || fText[fAt - 1] == 'E'))) {
         ++fAt;
     }
@@ -88,9 +79,9 @@ TQueryToken TQueryLexer::ReadText()
         if (fText[fAt] == '\\' && (next == '\\' || next == '\'' || next == '"')) {
             ++fAt;
         }
-        token.fText.push_back(fText[fAt]);
+        token.text.push_back(fText[fAt]);
     }
-    throw TQueryError(TZELStatusCode::kInvalidQuery, "the text that begins here has no second quote", token.fPosition);
+    throw TQueryError(TZELStatusCode::kInvalidQuery, "the text that begins here has no second quote", token.position);
 }
 
 TQueryToken TQueryLexer::ReadSymbol()

@@ -18,7 +18,7 @@ using TType = TCIMValue::TCIMType;
 
 std::string Describe(const TQueryOperand& operand, TType type)
 {
-    const std::string name = operand.fName.empty() ? "the value" : "'" + operand.fName + "'";
+    const std::string name = operand.name.empty() ? "the value" : "'" + operand.name + "'";
     return name + " (" + TValueText::GetTypeName(type) + (type.IsArray() ? " array)" : ")");
 }
 
@@ -36,89 +36,89 @@ TQueryMatcher::TQueryMatcher(const TQueryCondition& condition, const TInMemClass
 
 void TQueryMatcher::Bind(const TQueryCondition& condition)
 {
-    for (const auto& part : condition.fParts) {
+    for (const auto& part : condition.parts) {
         Bind(*part);
     }
-    for (const TQueryOperand& operand : condition.fOperands) {
-        if (!operand.fName.empty()) {
-            fSlots.resize(std::max(fSlots.size(), operand.fOrdinal + 1), TInMemClass::kNoSlot);
-            fSlots[operand.fOrdinal] = fClass.FindSlot(operand.fName);
+    for (const TQueryOperand& operand : condition.operands) {
+        if (!operand.name.empty()) {
+            fSlots.resize(std::max(fSlots.size(), operand.ordinal + 1), TInMemClass::kNoSlot);
+            fSlots[operand.ordinal] = fClass.FindSlot(operand.name);
         }
     }
-    if (condition.fKind == TQueryCondition::kLike) {
+    if (condition.kind == TQueryCondition::kLike) {
         CheckText(condition);
-    } else if (condition.fKind == TQueryCondition::kIsA) {
+    } else if (condition.kind == TQueryCondition::kIsA) {
         CheckIsA(condition);
-    } else if (condition.fOperands.size() == 2) {
+    } else if (condition.operands.size() == 2) {
         CheckComparison(condition);
     }
 }
 
 TType TQueryMatcher::GetType(const TQueryOperand& operand) const
 {
-    if (operand.fName.empty()) {
-        return operand.fLiteral.GetType();
+    if (operand.name.empty()) {
+        return operand.literal.GetType();
     }
-    const std::uint32_t slot = fSlots[operand.fOrdinal];
+    const std::uint32_t slot = fSlots[operand.ordinal];
     return slot == TInMemClass::kNoSlot ? TType(TType::kNone) : fClass.GetSlotDecl(slot).GetType();
 }
 
 void TQueryMatcher::CheckComparison(const TQueryCondition& test) const
 {
-    const TQueryOperand& left = test.fOperands[0];
-    const TQueryOperand& right = test.fOperands[1];
+    const TQueryOperand& left = test.operands[0];
+    const TQueryOperand& right = test.operands[1];
     const TType leftType = GetType(left);
     const TType rightType = GetType(right);
-    const bool isOrder = test.fKind != TQueryCondition::kEqual && test.fKind != TQueryCondition::kNotEqual;
+    const bool isOrder = test.kind != TQueryCondition::kEqual && test.kind != TQueryCondition::kNotEqual;
     if (!TQueryComparison::AreComparable(leftType, rightType)) {
-        Refuse(Describe(left, leftType) + " and " + Describe(right, rightType) + " do not compare", test.fPosition);
+        Refuse(Describe(left, leftType) + " and " + Describe(right, rightType) + " do not compare", test.position);
     }
     if (isOrder && !TQueryComparison::AreOrdered(leftType, rightType)) {
-        Refuse(Describe(left, leftType) + " and " + Describe(right, rightType) + " have no order", test.fPosition);
+        Refuse(Describe(left, leftType) + " and " + Describe(right, rightType) + " have no order", test.position);
     }
     for (const auto& [literal, type] : {std::make_pair(&left, rightType), std::make_pair(&right, leftType)}) {
-        if (literal->fName.empty() && !TQueryComparison::IsReadable(literal->fLiteral, type)) {
-            Refuse("'" + literal->fLiteral.ToText() + "' is no datetime", literal->fPosition);
+        if (literal->name.empty() && !TQueryComparison::IsReadable(literal->literal, type)) {
+            Refuse("'" + literal->literal.ToText() + "' is no datetime", literal->position);
         }
     }
 }
 
 void TQueryMatcher::CheckText(const TQueryCondition& test) const
 {
-    const TType type = GetType(test.fOperands[0]);
+    const TType type = GetType(test.operands[0]);
     if (type != TType::kString && type != TType::kNone) {
-        Refuse("LIKE needs text, " + Describe(test.fOperands[0], type) + " is none", test.fPosition);
+        Refuse("LIKE needs text, " + Describe(test.operands[0], type) + " is none", test.position);
     }
 }
 
 void TQueryMatcher::CheckIsA(const TQueryCondition& test) const
 {
-    const TType type = GetType(test.fOperands[0]);
-    if (!test.fOperands[0].fIsClass && type != TType::kString && type != TType::kReference && type != TType::kNone) {
-        Refuse("ISA needs an embedded object or a reference, " + Describe(test.fOperands[0], type) + " is none", test.fPosition);
+    const TType type = GetType(test.operands[0]);
+    if (!test.operands[0].isClass && type != TType::kString && type != TType::kReference && type != TType::kNone) {
+        Refuse("ISA needs an embedded object or a reference, " + Describe(test.operands[0], type) + " is none", test.position);
     }
 }
 
 const TCIMValue& TQueryMatcher::GetValue(const TQueryOperand& operand, const TInMemInstance& instance) const
 {
-    if (operand.fName.empty()) {
-        return operand.fLiteral;
+    if (operand.name.empty()) {
+        return operand.literal;
     }
     static const TCIMValue fgNull;
-    const std::uint32_t slot = fSlots[operand.fOrdinal];
+    const std::uint32_t slot = fSlots[operand.ordinal];
     return slot == TInMemClass::kNoSlot ? fgNull : instance.GetSlotValue(slot);
 }
 
 TQueryMatcher::ETruth TQueryMatcher::Evaluate(const TQueryCondition& condition, const TInMemInstance& instance) const
 {
-    switch (condition.fKind) {
+    switch (condition.kind) {
     case TQueryCondition::kOr:
     case TQueryCondition::kAnd:
         return EvaluateParts(condition, instance);
     case TQueryCondition::kNot:
-        return ETruth(kTrue - Evaluate(*condition.fParts[0], instance));
+        return ETruth(kTrue - Evaluate(*condition.parts[0], instance));
     case TQueryCondition::kIsNull:
-        return GetValue(condition.fOperands[0], instance).IsNull() ? kTrue : kFalse;
+        return GetValue(condition.operands[0], instance).IsNull() ? kTrue : kFalse;
     case TQueryCondition::kLike:
         return EvaluateLike(condition, instance);
     case TQueryCondition::kIsA:
@@ -130,10 +130,10 @@ TQueryMatcher::ETruth TQueryMatcher::Evaluate(const TQueryCondition& condition, 
 
 TQueryMatcher::ETruth TQueryMatcher::EvaluateParts(const TQueryCondition& condition, const TInMemInstance& instance) const
 {
-    const bool isOr = condition.fKind == TQueryCondition::kOr;
+    const bool isOr = condition.kind == TQueryCondition::kOr;
     const ETruth decisive = isOr ? kTrue : kFalse;
     ETruth result = isOr ? kFalse : kTrue;
-    for (const auto& part : condition.fParts) {
+    for (const auto& part : condition.parts) {
         const ETruth truth = Evaluate(*part, instance);
         if (truth == decisive) {
             return decisive;
@@ -145,12 +145,12 @@ TQueryMatcher::ETruth TQueryMatcher::EvaluateParts(const TQueryCondition& condit
 
 TQueryMatcher::ETruth TQueryMatcher::EvaluateComparison(const TQueryCondition& test, const TInMemInstance& instance) const
 {
-    const auto result = TQueryComparison::Compare(GetValue(test.fOperands[0], instance), GetValue(test.fOperands[1], instance));
+    const auto result = TQueryComparison::Compare(GetValue(test.operands[0], instance), GetValue(test.operands[1], instance));
     const auto isOne = [result](TQueryComparison::EResult a, TQueryComparison::EResult b) { return result == a || result == b; };
     if (result == TQueryComparison::kUnknown) {
         return kUnknown;
     }
-    switch (test.fKind) {
+    switch (test.kind) {
     case TQueryCondition::kEqual:
         return result == TQueryComparison::kEqual ? kTrue : kFalse;
     case TQueryCondition::kNotEqual:
@@ -168,28 +168,28 @@ TQueryMatcher::ETruth TQueryMatcher::EvaluateComparison(const TQueryCondition& t
 
 TQueryMatcher::ETruth TQueryMatcher::EvaluateLike(const TQueryCondition& test, const TInMemInstance& instance) const
 {
-    const TCIMValue& value = GetValue(test.fOperands[0], instance);
+    const TCIMValue& value = GetValue(test.operands[0], instance);
     if (value.IsNull() || value.GetEmbeddedObject()) {
         return kUnknown;
     }
-    return test.fPattern->Matches(value.GetString()) ? kTrue : kFalse;
+    return test.pattern->Matches(value.GetString()) ? kTrue : kFalse;
 }
 
 TQueryMatcher::ETruth TQueryMatcher::EvaluateIsA(const TQueryCondition& test, const TInMemInstance& instance) const
 {
-    if (test.fOperands[0].fIsClass) {
-        return fClass.IsSubclassOf(test.fClassName) ? kTrue : kFalse;
+    if (test.operands[0].isClass) {
+        return fClass.IsSubclassOf(test.className) ? kTrue : kFalse;
     }
-    const TCIMValue& value = GetValue(test.fOperands[0], instance);
+    const TCIMValue& value = GetValue(test.operands[0], instance);
     if (value.IsNull()) {
         return kUnknown;
     }
     if (value.GetType() == TType::kReference) {
         const TCIMReference path = value;
-        return IsA(path.GetClassName(), test.fClassName) ? kTrue : kFalse;
+        return IsA(path.GetClassName(), test.className) ? kTrue : kFalse;
     }
     const auto object = value.GetEmbeddedObject();
-    return object && IsA(object->GetClassName(), test.fClassName) ? kTrue : kFalse;
+    return object && IsA(object->GetClassName(), test.className) ? kTrue : kFalse;
 }
 
 /// Whether the class named, which need not be declared, is the wanted one or below it.

@@ -41,18 +41,18 @@ void TQueryParser::Fail(const std::string& message, std::size_t position) const
 
 void TQueryParser::FailExpected(const std::string& expected) const
 {
-    const std::string found = fToken.fKind == TQueryToken::kEnd ? "the end of the query" : "'" + fToken.fText + "'";
-    Fail("expected " + expected + ", found " + found, fToken.fPosition);
+    const std::string found = fToken.kind == TQueryToken::kEnd ? "the end of the query" : "'" + fToken.text + "'";
+    Fail("expected " + expected + ", found " + found, fToken.position);
 }
 
 bool TQueryParser::IsKeyword(const char* word) const
 {
-    return fToken.fKind == TQueryToken::kName && TNameText::Equal(fToken.fText, word);
+    return fToken.kind == TQueryToken::kName && TNameText::Equal(fToken.text, word);
 }
 
 bool TQueryParser::IsSymbol(const char* symbol) const
 {
-    return fToken.fKind == TQueryToken::kSymbol && fToken.fText == symbol;
+    return fToken.kind == TQueryToken::kSymbol && fToken.text == symbol;
 }
 
 bool TQueryParser::TakeKeyword(const char* word)
@@ -75,10 +75,10 @@ bool TQueryParser::TakeSymbol(const char* symbol)
 
 std::string TQueryParser::TakeName(const char* expected)
 {
-    if (fToken.fKind != TQueryToken::kName || IsAnyKeyword(fToken.fText)) {
+    if (fToken.kind != TQueryToken::kName || IsAnyKeyword(fToken.text)) {
         FailExpected(expected);
     }
-    std::string name = fToken.fText;
+    std::string name = fToken.text;
     Advance();
     return name;
 }
@@ -92,13 +92,13 @@ void TQueryParser::Parse()
     if (!TakeKeyword("FROM")) {
         FailExpected("FROM");
     }
-    fQuery.fClassPosition = fToken.fPosition;
+    fQuery.fClassPosition = fToken.position;
     fQuery.fClassName = TakeName("the name of a class");
     TakeList();
     if (TakeKeyword("WHERE")) {
         fQuery.fCondition = ReadOr();
     }
-    if (fToken.fKind != TQueryToken::kEnd) {
+    if (fToken.kind != TQueryToken::kEnd) {
         FailExpected(fQuery.fCondition ? "AND, OR or the end of the query" : "WHERE or the end of the query");
     }
 }
@@ -112,7 +112,7 @@ void TQueryParser::ReadList()
 
 TQueryParser::TListed TQueryParser::ReadListed()
 {
-    TListed listed{std::string(), std::string(), fToken.fPosition};
+    TListed listed{std::string(), std::string(), fToken.position};
     if (TakeSymbol("*")) {
         return listed;
     }
@@ -144,32 +144,32 @@ void TQueryParser::TakeList()
 
 TQueryParser::TPointer TQueryParser::ReadOr()
 {
-    auto condition = std::make_unique<TQueryCondition>(TQueryCondition::kOr, fToken.fPosition);
+    auto condition = std::make_unique<TQueryCondition>(TQueryCondition::kOr, fToken.position);
     do {
-        condition->fParts.push_back(ReadAnd());
+        condition->parts.push_back(ReadAnd());
     } while (TakeKeyword("OR"));
     return condition;
 }
 
 TQueryParser::TPointer TQueryParser::ReadAnd()
 {
-    auto condition = std::make_unique<TQueryCondition>(TQueryCondition::kAnd, fToken.fPosition);
+    auto condition = std::make_unique<TQueryCondition>(TQueryCondition::kAnd, fToken.position);
     do {
-        condition->fParts.push_back(ReadNot());
+        condition->parts.push_back(ReadNot());
     } while (TakeKeyword("AND"));
     return condition;
 }
 
 TQueryParser::TPointer TQueryParser::ReadNot()
 {
-    const std::size_t position = fToken.fPosition;
+    const std::size_t position = fToken.position;
     if (++fDepth > kMaxDepth) {
         Fail("conditions stand in each other more than " + std::to_string(kMaxDepth) + " deep", position);
     }
     TPointer condition;
     if (TakeKeyword("NOT")) {
         condition = std::make_unique<TQueryCondition>(TQueryCondition::kNot, position);
-        condition->fParts.push_back(ReadNot());
+        condition->parts.push_back(ReadNot());
     } else if (TakeSymbol("(")) {
         condition = ReadOr();
         if (!TakeSymbol(")")) {
@@ -188,7 +188,7 @@ TQueryParser::TPointer TQueryParser::ReadTest()
     if (IsKeyword("ISA")) {
         return ReadIsA(std::move(left));
     }
-    if (left.fIsClass) {
+    if (left.isClass) {
         FailExpected("ISA behind the name of the class");
     }
     if (TakeKeyword("LIKE")) {
@@ -206,12 +206,12 @@ TQueryParser::TPointer TQueryParser::ReadComparison(TQueryOperand left)
         if (!IsSymbol(symbol)) {
             continue;
         }
-        auto test = std::make_unique<TQueryCondition>(kind, left.fPosition);
+        auto test = std::make_unique<TQueryCondition>(kind, left.position);
         Advance();
-        test->fOperands.push_back(std::move(left));
-        test->fOperands.push_back(ReadOperand());
-        if (test->fOperands.back().fIsClass) {
-            Fail("expected a property or a value, found the name of the class", test->fOperands.back().fPosition);
+        test->operands.push_back(std::move(left));
+        test->operands.push_back(ReadOperand());
+        if (test->operands.back().isClass) {
+            Fail("expected a property or a value, found the name of the class", test->operands.back().position);
         }
         return test;
     }
@@ -220,59 +220,59 @@ TQueryParser::TPointer TQueryParser::ReadComparison(TQueryOperand left)
 
 TQueryParser::TPointer TQueryParser::ReadLike(TQueryOperand left)
 {
-    if (fToken.fKind != TQueryToken::kText) {
+    if (fToken.kind != TQueryToken::kText) {
         FailExpected("a pattern in quotes");
     }
-    auto test = std::make_unique<TQueryCondition>(TQueryCondition::kLike, left.fPosition);
-    test->fPattern = std::make_unique<TLikePattern>(fToken.fText);
-    test->fOperands.push_back(std::move(left));
+    auto test = std::make_unique<TQueryCondition>(TQueryCondition::kLike, left.position);
+    test->pattern = std::make_unique<TLikePattern>(fToken.text);
+    test->operands.push_back(std::move(left));
     Advance();
     return test;
 }
 
 TQueryParser::TPointer TQueryParser::ReadIsNull(TQueryOperand left)
 {
-    const std::size_t position = left.fPosition;
+    const std::size_t position = left.position;
     const bool isNegated = TakeKeyword("NOT");
     if (!TakeKeyword("NULL")) {
         FailExpected(isNegated ? "NULL" : "NULL or NOT NULL");
     }
     auto test = std::make_unique<TQueryCondition>(TQueryCondition::kIsNull, position);
-    test->fOperands.push_back(std::move(left));
+    test->operands.push_back(std::move(left));
     if (!isNegated) {
         return test;
     }
     auto negation = std::make_unique<TQueryCondition>(TQueryCondition::kNot, position);
-    negation->fParts.push_back(std::move(test));
+    negation->parts.push_back(std::move(test));
     return negation;
 }
 
 TQueryParser::TPointer TQueryParser::ReadIsA(TQueryOperand left)
 {
-    if (left.fName.empty() && !left.fIsClass) {
-        Fail("ISA asks for the class of a property or of the query's own class, not of a value", left.fPosition);
+    if (left.name.empty() && !left.isClass) {
+        Fail("ISA asks for the class of a property or of the query's own class, not of a value", left.position);
     }
     Advance();
-    auto test = std::make_unique<TQueryCondition>(TQueryCondition::kIsA, left.fPosition);
-    test->fOperands.push_back(std::move(left));
-    if (fToken.fKind == TQueryToken::kText) {
-        test->fClassName = fToken.fText;
+    auto test = std::make_unique<TQueryCondition>(TQueryCondition::kIsA, left.position);
+    test->operands.push_back(std::move(left));
+    if (fToken.kind == TQueryToken::kText) {
+        test->className = fToken.text;
         Advance();
     } else {
-        test->fClassName = TakeName("the name of a class");
+        test->className = TakeName("the name of a class");
     }
     return test;
 }
 
 TQueryOperand TQueryParser::ReadOperand()
 {
-    TQueryOperand operand{std::string(), TCIMValue(), fToken.fPosition, 0, false};
-    if (fToken.fKind == TQueryToken::kText) {
-        operand.fLiteral = TCIMValue(fToken.fText);
-    } else if (fToken.fKind == TQueryToken::kNumber) {
-        operand.fLiteral = ReadNumber();
+    TQueryOperand operand{std::string(), TCIMValue(), fToken.position, 0, false};
+    if (fToken.kind == TQueryToken::kText) {
+        operand.literal = TCIMValue(fToken.text);
+    } else if (fToken.kind == TQueryToken::kNumber) {
+        operand.literal = ReadNumber();
     } else if (IsKeyword("TRUE") || IsKeyword("FALSE")) {
-        operand.fLiteral = TCIMValue(IsKeyword("TRUE"));
+        operand.literal = TCIMValue(IsKeyword("TRUE"));
     } else if (!IsKeyword("NULL")) {
         return ReadProperty();
     }
@@ -282,19 +282,19 @@ TQueryOperand TQueryParser::ReadOperand()
 
 TQueryOperand TQueryParser::ReadProperty()
 {
-    TQueryOperand operand{std::string(), TCIMValue(), fToken.fPosition, 0, false};
-    operand.fName = TakeName("a property or a value");
+    TQueryOperand operand{std::string(), TCIMValue(), fToken.position, 0, false};
+    operand.name = TakeName("a property or a value");
     if (TakeSymbol(".")) {
-        if (!TNameText::Equal(operand.fName, fQuery.fClassName)) {
-            Fail("'" + operand.fName + "' is not the class of this query", operand.fPosition);
+        if (!TNameText::Equal(operand.name, fQuery.fClassName)) {
+            Fail("'" + operand.name + "' is not the class of this query", operand.position);
         }
-        operand.fName = TakeName("the name of a property");
-    } else if (IsKeyword("ISA") && TNameText::Equal(operand.fName, fQuery.fClassName)) {
-        operand.fName.clear();
-        operand.fIsClass = true;
+        operand.name = TakeName("the name of a property");
+    } else if (IsKeyword("ISA") && TNameText::Equal(operand.name, fQuery.fClassName)) {
+        operand.name.clear();
+        operand.isClass = true;
         return operand;
     }
-    operand.fOrdinal = fProperties++;
+    operand.ordinal = fProperties++;
     return operand;
 }
 
@@ -302,11 +302,11 @@ TCIMValue TQueryParser::ReadNumber() const
 {
     TCIMValue number;
     for (const auto type : {TCIMValue::TCIMType::kUint64, TCIMValue::TCIMType::kSint64, TCIMValue::TCIMType::kReal64}) {
-        if (TValueText::Parse(type, fToken.fText, number)) {
+        if (TValueText::Parse(type, fToken.text, number)) {
             return number;
         }
     }
-    Fail("'" + fToken.fText + "' is no number", fToken.fPosition);
+    Fail("'" + fToken.text + "' is no number", fToken.position);
 }
 
 }  // namespace NORVZEL20

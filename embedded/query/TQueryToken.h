@@ -15,9 +15,9 @@ struct TQueryToken {
         kSymbol   ///< an operator or a punctuation mark
     };
 
-    EKind fKind = kEnd;
-    std::string fText;
-    std::size_t fPosition = 0;  ///< of its first byte
+    EKind kind = kEnd;
+    std::string text;
+    std::size_t position = 0;  ///< of its first byte
 };
 
 }  // namespace NORVZEL20

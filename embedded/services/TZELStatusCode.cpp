@@ -5,8 +5,8 @@ namespace NORVZEL20 {
 namespace {
 
 struct TStatusText {
-    int fStatus;
-    std::string fText;
+    int status;
+    std::string text;
 };
 
 // Never destroyed: an exception may still be asked for its text while the process ends.
@@ -41,10 +41,10 @@ const TStatusText* GetTexts()
 const std::string& TZELStatusCode::TranslateStatusCode() const
 {
     const TStatusText* entry = GetTexts();
-    while (entry->fStatus != -1 && entry->fStatus != static_cast<int>(fStatus)) {
+    while (entry->status != -1 && entry->status != static_cast<int>(fStatus)) {
         ++entry;
     }
-    return entry->fText;
+    return entry->text;
 }
 
 }  // namespace NORVZEL20

@@ -4,22 +4,13 @@
 
 #include "embedded/store/TInMemNamespaceProvider.h"
 #include "embedded/value/EraseLast.h"
+#include "embedded/value/Trim.h"
 #include "host/RootClassName.h"
 #include "host/TZELException.h"
 
 namespace NORVZEL20 {
 
-namespace {
-
-std::string WithoutSlashes(const std::string& name)
-{
-    const std::size_t first = name.find_first_not_of('/');
-    return first == std::string::npos ? std::string() : name.substr(first, name.find_last_not_of('/') + 1 - first);
-}
-
-}  // namespace
-
-TInMemNamespace::TInMemNamespace(const std::string& name) : fName(WithoutSlashes(name)) {}
+TInMemNamespace::TInMemNamespace(const std::string& name) : fName(Trim(name, "/")) {}
 
 boost::shared_ptr<TInMemNamespace> TInMemNamespace::Create(const std::string& name)
 {

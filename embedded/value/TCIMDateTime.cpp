@@ -19,11 +19,11 @@ constexpr std::int64_t kDay = 24 * kHour;
 
 /// One field of the text: where it stands, its bit among the unknown ones, and its range.
 struct TField {
-    std::size_t fStart;
-    std::size_t fLength;
-    unsigned int fBit;
-    std::int64_t fLeast;
-    std::int64_t fGreatest;
+    std::size_t start;
+    std::size_t length;
+    unsigned int bit;
+    std::int64_t least;
+    std::int64_t greatest;
 };
 
 constexpr std::array<TField, 6> kTimestampFields{
@@ -44,13 +44,13 @@ bool ReadDigits(std::string_view digits, std::int64_t& number) noexcept
 
 bool ReadField(std::string_view text, const TField& field, std::int64_t& number, std::uint16_t& unknown) noexcept
 {
-    const std::string_view digits = text.substr(field.fStart, field.fLength);
+    const std::string_view digits = text.substr(field.start, field.length);
     if (digits.find_first_not_of('*') == std::string_view::npos) {
-        unknown = static_cast<std::uint16_t>(unknown | (1u << field.fBit));
-        number = field.fLeast;
+        unknown = static_cast<std::uint16_t>(unknown | (1u << field.bit));
+        number = field.least;
         return true;
     }
-    return ReadDigits(digits, number) && number >= field.fLeast && number <= field.fGreatest;
+    return ReadDigits(digits, number) && number >= field.least && number <= field.greatest;
 }
 
 bool ReadMicroseconds(std::string_view text, std::int64_t& number, std::uint16_t& unknown) noexcept
@@ -92,9 +92,9 @@ std::int64_t GetDays(std::int64_t year, std::int64_t month, std::int64_t day) no
 }
 
 struct TDate {
-    std::int64_t fYear;
-    std::int64_t fMonth;
-    std::int64_t fDay;
+    std::int64_t year;
+    std::int64_t month;
+    std::int64_t day;
 };
 
 TDate GetDate(std::int64_t days) noexcept
@@ -149,17 +149,17 @@ void WriteDigits(char* to, std::size_t length, std::int64_t number) noexcept
 void WriteDate(char* to, std::int64_t days) noexcept
 {
     const TDate date = GetDate(days);
-    WriteDigits(to, 4, date.fYear);
-    WriteDigits(to + 4, 2, date.fMonth);
-    WriteDigits(to + 6, 2, date.fDay);
+    WriteDigits(to, 4, date.year);
+    WriteDigits(to + 4, 2, date.month);
+    WriteDigits(to + 6, 2, date.day);
 }
 
 template <class TFields>
 void WriteAsterisks(char* to, const TFields& fields, unsigned int unknown) noexcept
 {
     for (const TField& field : fields) {
-        for (std::size_t i = 0; (unknown & (1u << field.fBit)) != 0 && i < field.fLength; ++i) {
-            to[field.fStart + i] = '*';
+        for (std::size_t i = 0; (unknown & (1u << field.bit)) != 0 && i < field.length; ++i) {
+            to[field.start + i] = '*';
         }
     }
     for (unsigned int i = 0; i < 6; ++i) {

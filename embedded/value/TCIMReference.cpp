@@ -8,6 +8,7 @@
 #include "embedded/value/TReferenceContents.h"
 #include "embedded/value/TStubClass.h"
 #include "embedded/value/TValueAccess.h"
+#include "embedded/value/Trim.h"
 #include "host/TZELException.h"
 
 namespace NORVZEL20 {
@@ -22,12 +23,6 @@ const std::string& GetEmptyText()
     return *fgEmpty;
 }
 
-std::string TrimSlashes(const std::string& name)
-{
-    const std::size_t first = name.find_first_not_of('/');
-    return first == std::string::npos ? std::string() : name.substr(first, name.find_last_not_of('/') + 1 - first);
-}
-
 }  // namespace
 
 TCIMReference::TCIMReference() : fContents(nullptr) {}
@@ -39,12 +34,12 @@ TCIMReference::TCIMReference(boost::shared_ptr<ICIMNamespace> ns, std::map<std::
     TCIMReference path(new TContents);  // owns the contents while they are filled
     if (ns) {
         TContents::TPlace& place = path.fContents->OwnPlace();
-        place.fNamespace = ns;
+        place.ns = ns;
         if (const auto* const located = dynamic_cast<const ILocated*>(ns.get())) {
-            place.fNamespaceName = TrimSlashes(located->GetNamespaceName());
+            place.namespaceName = Trim(located->GetNamespaceName(), "/");
         }
     }
-    path.fContents->fBindings.reserve(keys.size());
+    path.fContents->bindings.reserve(keys.size());
     for (const auto& [name, value] : keys) {
         path.AddKeyValue(name, value);
     }
@@ -90,7 +85,7 @@ void TCIMReference::AddKeyValue(const std::string& name, const TCIMValue& value)
         throw TZELException(TZELStatusCode::kInvalidParameter);
     }
     TContents& contents = Own();
-    auto& bindings = contents.fBindings;
+    auto& bindings = contents.bindings;
     const auto place =
         std::lower_bound(bindings.begin(), bindings.end(), name, [](const TContents::TBinding& binding, const std::string& wanted) {
             return TNameText::Compare(binding.first, wanted) < 0;
@@ -100,7 +95,7 @@ void TCIMReference::AddKeyValue(const std::string& name, const TCIMValue& value)
     } else {
         bindings.emplace(place, name, value);
     }
-    contents.fDepth = std::max(contents.fDepth, depth);
+    contents.depth = std::max(contents.depth, depth);
 }
 
 void TCIMReference::EnumerateKeyBindings(const boost::function<bool(std::pair<std::string, TCIMValue>)>& callback) const
@@ -109,7 +104,7 @@ void TCIMReference::EnumerateKeyBindings(const boost::function<bool(std::pair<st
     if (held.fContents == nullptr) {
         return;
     }
-    for (const TContents::TBinding& binding : held.fContents->fBindings) {
+    for (const TContents::TBinding& binding : held.fContents->bindings) {
         if (!callback(binding)) {
             return;
         }
@@ -118,12 +113,12 @@ void TCIMReference::EnumerateKeyBindings(const boost::function<bool(std::pair<st
 
 boost::shared_ptr<ICIMClass> TCIMReference::GetClass() const
 {
-    return fContents != nullptr ? fContents->fClass : nullptr;
+    return fContents != nullptr ? fContents->cls : nullptr;
 }
 
 void TCIMReference::SetClass(boost::shared_ptr<ICIMClass> cls)
 {
-    Own().fClass = std::move(cls);
+    Own().cls = std::move(cls);
 }
 
 std::string TCIMReference::GetPath() const
@@ -138,7 +133,7 @@ std::size_t TCIMReference::EstimateLength() const
 {
     std::size_t length = GetHost().size() + GetNamespaceName().size() + GetClassName().size() + 4;
     for (std::size_t i = 0; i < GetKeyCount(); ++i) {
-        const auto& [name, value] = fContents->fBindings[i];
+        const auto& [name, value] = fContents->bindings[i];
         length += name.size() + 4 + (TValueAccess::IsText(value) ? TValueAccess::GetText(value).size() : kUsualNumberLength);
     }
     return length;
@@ -157,7 +152,7 @@ void TCIMReference::AppendPath(std::string& out) const
     }
     out += GetClassName();
     char separator = '.';
-    for (const TContents::TBinding& binding : fContents->fBindings) {
+    for (const TContents::TBinding& binding : fContents->bindings) {
         out.append(1, separator).append(binding.first).append(1, '=');
         binding.second.AppendKeyText(out);
         separator = ',';
@@ -166,37 +161,37 @@ void TCIMReference::AppendPath(std::string& out) const
 
 boost::shared_ptr<ICIMNamespace> TCIMReference::GetNamespace() const
 {
-    return fContents != nullptr && fContents->fPlace ? fContents->fPlace->fNamespace.lock() : nullptr;
+    return fContents != nullptr && fContents->place ? fContents->place->ns.lock() : nullptr;
 }
 
 const std::string& TCIMReference::GetNamespaceName() const
 {
-    return fContents != nullptr && fContents->fPlace ? fContents->fPlace->fNamespaceName : GetEmptyText();
+    return fContents != nullptr && fContents->place ? fContents->place->namespaceName : GetEmptyText();
 }
 
 void TCIMReference::SetNamespaceName(const std::string& name)
 {
-    std::string trimmed = TrimSlashes(name);
+    std::string trimmed(Trim(name, "/"));
     TContents::TPlace& place = Own().OwnPlace();
-    if (!TNameText::Equal(place.fNamespaceName, trimmed)) {
-        place.fNamespace.reset();
+    if (!TNameText::Equal(place.namespaceName, trimmed)) {
+        place.ns.reset();
     }
-    place.fNamespaceName = std::move(trimmed);
+    place.namespaceName = std::move(trimmed);
 }
 
 const std::string& TCIMReference::GetHost() const
 {
-    return fContents != nullptr && fContents->fPlace ? fContents->fPlace->fHost : GetEmptyText();
+    return fContents != nullptr && fContents->place ? fContents->place->host : GetEmptyText();
 }
 
 void TCIMReference::SetHost(const std::string& host)
 {
-    Own().OwnPlace().fHost = host;
+    Own().OwnPlace().host = host;
 }
 
 const std::string& TCIMReference::GetClassName() const
 {
-    return fContents != nullptr && fContents->fClass ? fContents->fClass->GetName(TCallContext()) : GetEmptyText();
+    return fContents != nullptr && fContents->cls ? fContents->cls->GetName(TCallContext()) : GetEmptyText();
 }
 
 void TCIMReference::SetClassName(const std::string& name)
@@ -206,7 +201,7 @@ void TCIMReference::SetClassName(const std::string& name)
 
 std::size_t TCIMReference::GetKeyCount() const
 {
-    return fContents != nullptr ? fContents->fBindings.size() : 0;
+    return fContents != nullptr ? fContents->bindings.size() : 0;
 }
 
 const TCIMValue* TCIMReference::FindKeyValue(const std::string& name) const
@@ -214,7 +209,7 @@ const TCIMValue* TCIMReference::FindKeyValue(const std::string& name) const
     if (fContents == nullptr) {
         return nullptr;
     }
-    const auto& bindings = fContents->fBindings;
+    const auto& bindings = fContents->bindings;
     const auto found = std::find_if(bindings.begin(), bindings.end(),
                                     [&name](const TContents::TBinding& binding) { return TNameText::Equal(binding.first, name); });
     return found != bindings.end() ? &found->second : nullptr;
@@ -225,7 +220,7 @@ unsigned int TCIMReference::TContents::GetDepth(const TCIMValue& value)
     switch (TValueAccess::GetForm(value)) {
     case TValueAccess::kPath: {
         const TContents* const contents = TValueAccess::GetPath(value).fContents;
-        return contents != nullptr ? contents->fDepth + 1 : 1;
+        return contents != nullptr ? contents->depth + 1 : 1;
     }
     case TValueAccess::kArray:
     case TValueAccess::kBag: {

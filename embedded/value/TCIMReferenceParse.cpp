@@ -18,9 +18,9 @@ namespace {
 class TPathReader {
   public:
     struct TBinding {
-        std::string fName;
-        TCIMValue fValue;
-        std::size_t fPosition;
+        std::string name;
+        TCIMValue value;
+        std::size_t position;
     };
 
     explicit TPathReader(std::string_view text) : fText(text) {}
@@ -86,18 +86,13 @@ class TPathReader {
         }
     }
 
-    static bool IsNameCharacter(char c, bool isFirst)
-    {
-        const char lower = TNameText::ToLower(c);
-        return (lower >= 'a' && lower <= 'z') || c == '_' || static_cast<unsigned char>(c) >= 0x80 ||
-               (!isFirst && c >= '0' && c <= '9');
-    }
-
     std::string_view ReadName()
     {
         const std::size_t start = fPosition;
-        while (fPosition < fText.size() && IsNameCharacter(fText[fPosition], fPosition == start)) {
-            ++fPosition;
+        if (TNameText::IsNameStart(Peek())) {
+            while (TNameText::IsNamePart(Peek())) {
+                ++fPosition;
+            }
         }
         return fText.substr(start, fPosition - start);
     }
@@ -174,12 +169,12 @@ class TPathReader {
     void SortBindings()
     {
         std::stable_sort(fBindings.begin(), fBindings.end(),
-                         [](const TBinding& a, const TBinding& b) { return TNameText::Compare(a.fName, b.fName) < 0; });
+                         [](const TBinding& a, const TBinding& b) { return TNameText::Compare(a.name, b.name) < 0; });
         const auto repeated = std::adjacent_find(fBindings.begin(), fBindings.end(), [](const TBinding& a, const TBinding& b) {
-            return TNameText::Equal(a.fName, b.fName);
+            return TNameText::Equal(a.name, b.name);
         });
         if (repeated != fBindings.end()) {
-            fPosition = std::next(repeated)->fPosition;
+            fPosition = std::next(repeated)->position;
             Fail();
         }
     }
@@ -226,12 +221,12 @@ TCIMReference TCIMReference::Parse(const std::string& text, boost::shared_ptr<IC
     }
     const std::string className(reader.GetClassName());
     path.SetClass(ns && !className.empty() ? FindClass(*ns, className) : nullptr);
-    if (!path.fContents->fClass) {
+    if (!path.fContents->cls) {
         path.SetClassName(className);
     }
-    path.fContents->fBindings.reserve(reader.GetBindings().size());
+    path.fContents->bindings.reserve(reader.GetBindings().size());
     for (TPathReader::TBinding& binding : reader.GetBindings()) {
-        path.fContents->fBindings.emplace_back(std::move(binding.fName), std::move(binding.fValue));
+        path.fContents->bindings.emplace_back(std::move(binding.name), std::move(binding.value));
     }
     return path;
 }

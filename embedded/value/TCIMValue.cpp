@@ -4,6 +4,7 @@
 #include <limits>
 
 #include "embedded/value/TCountedBlocks.h"
+#include "embedded/value/TTypeKind.h"
 #include "embedded/value/TValueAccess.h"
 #include "embedded/value/TValueText.h"
 #include "embedded/value/TValueXml.h"
@@ -14,33 +15,9 @@ namespace NORVZEL20 {
 namespace {
 
 using TAccess = TValueAccess;
-using TType = TCIMValue::TCIMType;
-
 [[noreturn]] void RefuseType()
 {
     throw TZELException(TZELStatusCode::kTypeMismatch);
-}
-
-bool IsUnsigned(TType::ECIMType type) noexcept
-{
-    return type == TType::kUint8 || type == TType::kUint16 || type == TType::kUint32 || type == TType::kUint64;
-}
-
-bool IsSigned(TType::ECIMType type) noexcept
-{
-    return type == TType::kSint8 || type == TType::kSint16 || type == TType::kSint32 || type == TType::kSint64;
-}
-
-bool IsReal(TType::ECIMType type) noexcept
-{
-    return type == TType::kReal32 || type == TType::kReal64;
-}
-
-double AsDouble(std::uint64_t bits) noexcept
-{
-    double number;
-    std::memcpy(&number, &bits, sizeof number);
-    return number;
 }
 
 void AppendElement(std::string& out, const TCIMValue& element)
@@ -203,7 +180,7 @@ bool TCIMValue::IsNull() const noexcept
 
 TCIMValue::operator unsigned short() const
 {
-    const bool isInteger = !IsNull() && (IsUnsigned(fType) || IsSigned(fType));
+    const bool isInteger = !IsNull() && TTypeKind::IsInteger(fType);
     // A negative number, sign-extended, lies far beyond the range too.
     if (!isInteger || TAccess::GetBits(*this) > std::numeric_limits<unsigned short>::max()) {
         RefuseType();
@@ -229,7 +206,7 @@ bool TCIMValue::GetBoolean() const
 
 std::uint64_t TCIMValue::GetUnsigned() const
 {
-    if (IsNull() || !IsUnsigned(fType)) {
+    if (IsNull() || !TTypeKind::IsUnsigned(fType)) {
         RefuseType();
     }
     return TAccess::GetBits(*this);
@@ -237,7 +214,7 @@ std::uint64_t TCIMValue::GetUnsigned() const
 
 std::int64_t TCIMValue::GetSigned() const
 {
-    if (IsNull() || !IsSigned(fType)) {
+    if (IsNull() || !TTypeKind::IsSigned(fType)) {
         RefuseType();
     }
     return static_cast<std::int64_t>(TAccess::GetBits(*this));
@@ -245,10 +222,10 @@ std::int64_t TCIMValue::GetSigned() const
 
 double TCIMValue::GetReal() const
 {
-    if (IsNull() || !IsReal(fType)) {
+    if (IsNull() || !TTypeKind::IsReal(fType)) {
         RefuseType();
     }
-    return AsDouble(TAccess::GetBits(*this));
+    return TAccess::GetReal(*this);
 }
 
 char16_t TCIMValue::GetChar16() const
@@ -256,7 +233,7 @@ char16_t TCIMValue::GetChar16() const
     if (IsNull() || fType != TCIMType::kChar16) {
         RefuseType();
     }
-    return char16_t(TAccess::GetBits(*this));
+    return static_cast<char16_t>(TAccess::GetBits(*this));
 }
 
 std::string_view TCIMValue::GetString() const
@@ -280,7 +257,7 @@ boost::shared_ptr<const TEmbeddedObject> TCIMValue::GetEmbeddedObject() const
     if (fType != TCIMType::kString) {
         RefuseType();
     }
-    return fForm == TAccess::kObject ? static_cast<const TCountedObject*>(TAccess::GetBlock(*this))->fObject : nullptr;
+    return fForm == TAccess::kObject ? static_cast<const TCountedObject*>(TAccess::GetBlock(*this))->object : nullptr;
 }
 
 const std::vector<TCIMValue>& TCIMValue::GetElements() const
@@ -288,7 +265,7 @@ const std::vector<TCIMValue>& TCIMValue::GetElements() const
     if (fForm != TAccess::kArray && fForm != TAccess::kBag) {
         RefuseType();
     }
-    return static_cast<const TCountedArray*>(TAccess::GetBlock(*this))->fElements;
+    return static_cast<const TCountedArray*>(TAccess::GetBlock(*this))->elements;
 }
 
 TCIMValue TCIMValue::AsBag() const
@@ -339,7 +316,7 @@ void TCIMValue::AppendKeyText(std::string& out) const
     case TAccess::kNumber:
         if (fType == TCIMType::kChar16) {
             TValueText::AppendQuoted(out, ToText(), '\'');
-        } else if ((fType == TCIMType::kReal32 || fType == TCIMType::kReal64) && GetReal() == 0) {
+        } else if (TTypeKind::IsReal(fType) && TAccess::GetReal(*this) == 0) {
             out += '0';  // equal values have equal paths, and -0 equals 0
         } else {
             TValueText::AppendPlain(out, *this);

@@ -3,6 +3,7 @@
 #include <functional>
 
 #include "embedded/value/TCountedBlocks.h"
+#include "embedded/value/TTypeKind.h"
 #include "embedded/value/TValueAccess.h"
 #include "host/TCIMValue.h"
 
@@ -12,23 +13,9 @@ namespace {
 
 using TAccess = TValueAccess;
 
-bool IsReal(TCIMValue::TCIMType::ECIMType type) noexcept
+bool EqualReals(double a, double b) noexcept
 {
-    return type == TCIMValue::TCIMType::kReal32 || type == TCIMValue::TCIMType::kReal64;
-}
-
-double AsDouble(std::uint64_t bits) noexcept
-{
-    double number;
-    std::memcpy(&number, &bits, sizeof number);
-    return number;
-}
-
-bool EqualReals(std::uint64_t a, std::uint64_t b) noexcept
-{
-    const double x = AsDouble(a);
-    const double y = AsDouble(b);
-    return !(x < y) && !(x > y) && std::isnan(x) == std::isnan(y);
+    return !(a < b) && !(a > b) && std::isnan(a) == std::isnan(b);
 }
 
 bool EqualInOrder(const std::vector<TCIMValue>& a, const std::vector<TCIMValue>& b)
@@ -105,7 +92,7 @@ bool TCIMValue::operator==(const TCIMValue& other) const
     }
     switch (fForm) {
     case TAccess::kNumber:
-        return IsReal(fType) && EqualReals(TAccess::GetBits(*this), TAccess::GetBits(other));
+        return TTypeKind::IsReal(fType) && EqualReals(TAccess::GetReal(*this), TAccess::GetReal(other));
     case TAccess::kDateTime:
         return TAccess::LoadDateTime(*this) == TAccess::LoadDateTime(other);
     case TAccess::kObject:
@@ -127,8 +114,8 @@ std::size_t TCIMValue::Hash() const
     case TAccess::kNull:
         return 0;
     case TAccess::kNumber:
-        return IsReal(fType) ? std::hash<double>()(std::isnan(GetReal()) ? 1e-300 : GetReal())
-                             : Mix(fType, static_cast<std::size_t>(TAccess::GetBits(*this)));
+        return TTypeKind::IsReal(fType) ? std::hash<double>()(std::isnan(GetReal()) ? 1e-300 : GetReal())
+                                        : Mix(fType, static_cast<std::size_t>(TAccess::GetBits(*this)));
     case TAccess::kDateTime:
         return Mix(static_cast<std::size_t>(TAccess::LoadDateTime(*this).GetMicroseconds()),
                    TAccess::LoadDateTime(*this).GetUnknown());

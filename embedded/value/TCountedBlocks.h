@@ -10,16 +10,16 @@ namespace NORVZEL20 {
 
 /// The shared contents of an array value.
 struct TCountedArray : TCounted {
-    explicit TCountedArray(std::vector<TCIMValue> elements) : fElements(std::move(elements)) {}
+    explicit TCountedArray(std::vector<TCIMValue> contents) : elements(std::move(contents)) {}
 
-    const std::vector<TCIMValue> fElements;
+    const std::vector<TCIMValue> elements;
 };
 
 /// The shared contents of a string value that is an embedded object.
 struct TCountedObject : TCounted {
-    explicit TCountedObject(boost::shared_ptr<const TEmbeddedObject> object) : fObject(std::move(object)) {}
+    explicit TCountedObject(boost::shared_ptr<const TEmbeddedObject> contents) : object(std::move(contents)) {}
 
-    const boost::shared_ptr<const TEmbeddedObject> fObject;
+    const boost::shared_ptr<const TEmbeddedObject> object;
 };
 
 }  // namespace NORVZEL20

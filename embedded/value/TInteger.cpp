@@ -2,19 +2,22 @@
 
 #include <limits>
 
+#include "embedded/value/TTypeKind.h"
+#include "embedded/value/TValueAccess.h"
+
 namespace NORVZEL20 {
 
 namespace {
 
 struct TIntegerRange {
-    std::int64_t fLeast;
-    std::uint64_t fGreatest;
+    std::int64_t least;
+    std::uint64_t greatest;
 };
 
 template <class T>
 constexpr TIntegerRange kRangeOf{std::numeric_limits<T>::min(), static_cast<std::uint64_t>(std::numeric_limits<T>::max())};
 
-// By type code, from uint8 to sint64.
+// In the order of the type codes, from uint8 to sint64.
 constexpr TIntegerRange kIntegerRanges[] = {kRangeOf<std::uint8_t>,  kRangeOf<std::int8_t>,   kRangeOf<std::uint16_t>,
                                             kRangeOf<std::int16_t>,  kRangeOf<std::uint32_t>, kRangeOf<std::int32_t>,
                                             kRangeOf<std::uint64_t>, kRangeOf<std::int64_t>};
@@ -24,7 +27,7 @@ constexpr TIntegerRange kIntegerRanges[] = {kRangeOf<std::uint8_t>,  kRangeOf<st
 TInteger TInteger::Read(const TCIMValue& value) noexcept
 {
     const std::uint64_t bits = TValueAccess::GetBits(value);
-    const bool isNegative = IsOfSigned(value.GetType()) && (bits >> 63) != 0;
+    const bool isNegative = TTypeKind::IsSigned(value.GetType()) && (bits >> 63) != 0;
     return {isNegative ? static_cast<std::uint64_t>(0) - bits : bits, isNegative};
 }
 
@@ -32,11 +35,11 @@ bool TInteger::Make(TCIMValue::TCIMType::ECIMType type, TCIMValue& result) const
 {
     const TIntegerRange& range = kIntegerRanges[type - TCIMValue::TCIMType::kUint8];
     const std::uint64_t bound =
-        fIsNegative ? static_cast<std::uint64_t>(0) - static_cast<std::uint64_t>(range.fLeast) : range.fGreatest;
-    if (fMagnitude > bound) {
+        isNegative ? static_cast<std::uint64_t>(0) - static_cast<std::uint64_t>(range.least) : range.greatest;
+    if (magnitude > bound) {
         return false;
     }
-    result = TValueAccess::FromBits(type, fIsNegative ? static_cast<std::uint64_t>(0) - fMagnitude : fMagnitude);
+    result = TValueAccess::FromBits(type, isNegative ? static_cast<std::uint64_t>(0) - magnitude : magnitude);
     return true;
 }
 

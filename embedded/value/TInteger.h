@@ -2,28 +2,19 @@
 
 #include <cstdint>
 
-#include "embedded/value/TValueAccess.h"
+#include "host/TCIMValue.h"
 
 namespace NORVZEL20 {
 
-/// An integer of any CIM type: its size and on which side of zero it is. Converts between the types without loss or not at all.
+/// An integer of any CIM type as magnitude and sign. It converts between the types only without loss.
 struct TInteger {
-    std::uint64_t fMagnitude;
-    bool fIsNegative;
+    std::uint64_t magnitude;
+    bool isNegative;
 
-    static bool IsOfInteger(TCIMValue::TCIMType::ECIMType type) noexcept
-    {
-        return type >= TCIMValue::TCIMType::kUint8 && type <= TCIMValue::TCIMType::kSint64;
-    }
-    static bool IsOfSigned(TCIMValue::TCIMType::ECIMType type) noexcept
-    {
-        return IsOfInteger(type) && (type - TCIMValue::TCIMType::kUint8) % 2 == 1;
-    }
-
-    /// Of a value of an integer type that is not null.
+    /// The number of a value that has an integer type and is not null.
     static TInteger Read(const TCIMValue& value) noexcept;
 
-    /// A value of the integer type `type`. False, with `result` as it is, where the number lies outside of its range.
+    /// Makes a value of the integer type `type`. Returns false, and leaves `result` as it is, if the number is out of range.
     bool Make(TCIMValue::TCIMType::ECIMType type, TCIMValue& result) const noexcept;
 };
 

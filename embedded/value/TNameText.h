@@ -16,6 +16,13 @@ class TNameText {
 
     static constexpr char ToLower(char c) noexcept { return c >= 'A' && c <= 'Z' ? static_cast<char>(c + ('a' - 'A')) : c; }
     static std::string ToLower(std::string_view name);
+    /// Whether a name may begin with `c`: a letter, an underscore or any byte of a character beyond ASCII.
+    static constexpr bool IsNameStart(char c) noexcept
+    {
+        return (ToLower(c) >= 'a' && ToLower(c) <= 'z') || c == '_' || static_cast<unsigned char>(c) >= 0x80;
+    }
+    /// Whether a name may go on with `c`: a digit or what IsNameStart accepts.
+    static constexpr bool IsNamePart(char c) noexcept { return IsNameStart(c) || (c >= '0' && c <= '9'); }
     static bool Equal(std::string_view a, std::string_view b) noexcept;
     /// Negative, zero or positive, as the lower-case forms compare byte for byte.
     static int Compare(std::string_view a, std::string_view b) noexcept;

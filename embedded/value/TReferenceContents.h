@@ -17,9 +17,9 @@ struct TCIMReference::TContents : TCounted {
     using TBinding = std::pair<std::string, TCIMValue>;
 
     struct TPlace {
-        boost::weak_ptr<ICIMNamespace> fNamespace;
-        std::string fNamespaceName;
-        std::string fHost;
+        boost::weak_ptr<ICIMNamespace> ns;
+        std::string namespaceName;
+        std::string host;
     };
 
     // Each level doubles the escapes of the one within, so that the text of a deep path would fill any memory.
@@ -27,25 +27,25 @@ struct TCIMReference::TContents : TCounted {
 
     TContents() = default;
     TContents(const TContents& other)
-        : TCounted(), fPlace(other.fPlace ? std::make_unique<TPlace>(*other.fPlace) : nullptr), fClass(other.fClass),
-          fBindings(other.fBindings), fDepth(other.fDepth)
+        : TCounted(), place(other.place ? std::make_unique<TPlace>(*other.place) : nullptr), cls(other.cls),
+          bindings(other.bindings), depth(other.depth)
     {}
 
     TPlace& OwnPlace()
     {
-        if (!fPlace) {
-            fPlace = std::make_unique<TPlace>();
+        if (!place) {
+            place = std::make_unique<TPlace>();
         }
-        return *fPlace;
+        return *place;
     }
 
     /// How deep references stand in `value`; 0 where there is none.
     static unsigned int GetDepth(const TCIMValue& value);
 
-    std::unique_ptr<TPlace> fPlace;  // null: no namespace and no host
-    boost::shared_ptr<ICIMClass> fClass;
-    std::vector<TBinding> fBindings;  // in the order of the names in lower case
-    unsigned int fDepth = 0;          // how deep references stand in the bindings of references
+    std::unique_ptr<TPlace> place;  // null: no namespace and no host
+    boost::shared_ptr<ICIMClass> cls;
+    std::vector<TBinding> bindings;  // in the order of the names in lower case
+    unsigned int depth = 0;          // how deep references stand in the bindings of references
 };
 
 }  // namespace NORVZEL20

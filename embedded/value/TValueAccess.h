@@ -38,6 +38,8 @@ class TValueAccess {
 
     /// The number of a value of form kNumber: signed integers sign-extended, reals as the bits of a double, char16 as its unit.
     static std::uint64_t GetBits(const TCIMValue& value) noexcept { return Load<std::uint64_t>(value); }
+    /// The number of a real.
+    static double GetReal(const TCIMValue& value) noexcept { return Load<double>(value); }
     /// A value of the non-array type `type`, which must be one that form kNumber serves; `bits` as in GetBits, in range.
     static TCIMValue FromBits(TCIMValue::TCIMType type, std::uint64_t bits) noexcept;
     static TCIMValue FromReal(TCIMValue::TCIMType type, double number) noexcept;

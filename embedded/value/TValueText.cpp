@@ -7,8 +7,10 @@
 
 #include "embedded/value/TInteger.h"
 #include "embedded/value/TNameText.h"
+#include "embedded/value/TTypeKind.h"
 #include "embedded/value/TUtf8.h"
 #include "embedded/value/TValueAccess.h"
+#include "embedded/value/Trim.h"
 #include "host/TCIMDateTime.h"
 
 namespace NORVZEL20 {
@@ -17,15 +19,10 @@ namespace {
 
 using TType = TCIMValue::TCIMType;
 
+constexpr std::string_view kBlanks = " \t\r\n";
+
 constexpr const char* kTypeNames[] = {"",       "boolean", "uint8",  "sint8",  "uint16", "sint16", "uint32",   "sint32",
                                       "uint64", "sint64",  "real32", "real64", "char16", "string", "datetime", "reference"};
-
-std::string_view Trim(std::string_view text) noexcept
-{
-    constexpr std::string_view kBlanks = " \t\r\n";
-    const std::size_t first = text.find_first_not_of(kBlanks);
-    return first == std::string_view::npos ? std::string_view() : text.substr(first, text.find_last_not_of(kBlanks) + 1 - first);
-}
 
 template <class T>
 bool ReadAll(std::string_view digits, T& number, int base)
@@ -48,14 +45,14 @@ bool ParseBoolean(std::string_view text, TCIMValue& result)
 bool ParseInteger(TType::ECIMType type, std::string_view text, TCIMValue& result)
 {
     TInteger number{0, !text.empty() && text[0] == '-'};
-    if (number.fIsNegative && !TInteger::IsOfSigned(type)) {
+    if (number.isNegative && !TTypeKind::IsSigned(type)) {
         return false;
     }
-    if (number.fIsNegative || (!text.empty() && text[0] == '+')) {
+    if (number.isNegative || (!text.empty() && text[0] == '+')) {
         text.remove_prefix(1);
     }
     const bool isHexadecimal = text.size() > 2 && text[0] == '0' && TNameText::ToLower(text[1]) == 'x';
-    const bool isRead = isHexadecimal ? ReadAll(text.substr(2), number.fMagnitude, 16) : ReadAll(text, number.fMagnitude, 10);
+    const bool isRead = isHexadecimal ? ReadAll(text.substr(2), number.magnitude, 16) : ReadAll(text, number.magnitude, 10);
     return isRead && number.Make(type, result);
 }
 
@@ -146,21 +143,21 @@ bool ParseDateTime(std::string_view text, TCIMValue& result)
 
 bool TValueText::Parse(TCIMValue::TCIMType type, std::string_view text, TCIMValue& result)
 {
-    switch (TType::ECIMType(type)) {
+    switch (static_cast<TType::ECIMType>(type)) {
     case TType::kString:
         result = TCIMValue::FromText(text);
         return true;
     case TType::kChar16:
         return ParseChar16(text, result);
     case TType::kBoolean:
-        return ParseBoolean(Trim(text), result);
+        return ParseBoolean(Trim(text, kBlanks), result);
     case TType::kDateTime:
-        return ParseDateTime(Trim(text), result);
+        return ParseDateTime(Trim(text, kBlanks), result);
     case TType::kReal32:
     case TType::kReal64:
-        return ParseReal(type, Trim(text), result);
+        return ParseReal(type, Trim(text, kBlanks), result);
     default:
-        return TInteger::IsOfInteger(type) && ParseInteger(type, Trim(text), result);
+        return TTypeKind::IsInteger(type) && ParseInteger(type, Trim(text, kBlanks), result);
     }
 }
 
@@ -180,7 +177,7 @@ TCIMValue::TCIMType TValueText::FindType(std::string_view name) noexcept
 {
     for (unsigned char code = TType::kBoolean; code <= TType::kReference; ++code) {
         if (name == kTypeNames[code]) {
-            return TType::ECIMType(code);
+            return static_cast<TType::ECIMType>(code);
         }
     }
     return TType::kNone;
@@ -207,7 +204,7 @@ void TValueText::AppendPlain(std::string& out, const TCIMValue& value)
         AppendReal(out, value.GetReal(), type == TType::kReal32);
         break;
     default:
-        if (TInteger::IsOfSigned(type)) {
+        if (TTypeKind::IsSigned(type)) {
             AppendSigned(out, value.GetSigned());
         } else {
             AppendUnsigned(out, value.GetUnsigned());

@@ -2,6 +2,7 @@
 #include <limits>
 
 #include "embedded/value/TInteger.h"
+#include "embedded/value/TTypeKind.h"
 #include "embedded/value/TValueAccess.h"
 #include "embedded/value/TValueText.h"
 #include "host/TZELException.h"
@@ -12,24 +13,19 @@ namespace {
 
 using TType = TCIMValue::TCIMType;
 
-bool IsReal(TType::ECIMType type) noexcept
-{
-    return type == TType::kReal32 || type == TType::kReal64;
-}
-
 bool ConvertToReal(const TCIMValue& value, TType::ECIMType type, TCIMValue& result)
 {
     double number = 0;
-    if (IsReal(value.GetType())) {
+    if (TTypeKind::IsReal(value.GetType())) {
         number = value.GetReal();
     } else {
         const TInteger integer = TInteger::Read(value);
-        number = static_cast<double>(integer.fMagnitude);
+        number = static_cast<double>(integer.magnitude);
         // 2^64 itself would not convert back.
-        if (number >= 0x1p64 || static_cast<std::uint64_t>(number) != integer.fMagnitude) {
+        if (number >= 0x1p64 || static_cast<std::uint64_t>(number) != integer.magnitude) {
             return false;
         }
-        number = integer.fIsNegative ? -number : number;
+        number = integer.isNegative ? -number : number;
     }
     if (type == TType::kReal32 && !std::isnan(number) && !std::isinf(number) &&
         (std::fabs(number) > static_cast<double>(std::numeric_limits<float>::max()) ||
@@ -60,18 +56,18 @@ bool ConvertArray(const TCIMValue& value, TType type, TCIMValue& result)
             return false;
         }
     }
-    TCIMValue array(type, static_cast<unsigned>(elements.size()), elements);
+    TCIMValue array(type, static_cast<unsigned int>(elements.size()), elements);
     result = value.IsBag() ? array.AsBag() : array;
     return true;
 }
 
 bool ConvertNumber(const TCIMValue& value, TType::ECIMType type, TCIMValue& result)
 {
-    const bool isInteger = TInteger::IsOfInteger(value.GetType());
-    if (isInteger && TInteger::IsOfInteger(type)) {
+    const bool isInteger = TTypeKind::IsInteger(value.GetType());
+    if (isInteger && TTypeKind::IsInteger(type)) {
         return TInteger::Read(value).Make(type, result);
     }
-    return (isInteger || IsReal(value.GetType())) && IsReal(type) && ConvertToReal(value, type, result);
+    return (isInteger || TTypeKind::IsReal(value.GetType())) && TTypeKind::IsReal(type) && ConvertToReal(value, type, result);
 }
 
 }  // namespace

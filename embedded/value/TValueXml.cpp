@@ -3,6 +3,7 @@
 #include <algorithm>
 #include <cmath>
 
+#include "embedded/value/TTypeKind.h"
 #include "embedded/value/TValueAccess.h"
 #include "embedded/value/TValueText.h"
 
@@ -32,7 +33,7 @@ void AppendSimple(std::string& out, const TCIMValue& value)
         TValueXml::AppendEscaped(out, TAccess::GetText(value));
     } else if (TAccess::GetForm(value) == TAccess::kObject || type == TType::kChar16) {
         TValueXml::AppendEscaped(out, value.ToText());
-    } else if (type == TType::kReal32 || type == TType::kReal64) {
+    } else if (TTypeKind::IsReal(type)) {
         AppendRealWithPoint(out, value);
     } else {
         TValueText::AppendPlain(out, value);
