@@ -1,12 +1,12 @@
 #include "client/commands/ShowCommand.h"
 
+#include "client/inventory/CollectObjects.h"
 #include "client/inventory/TInventoryLoader.h"
 #include "client/process/ExitStatus.h"
 #include "client/process/TClientError.h"
 #include "client/report/InstanceListing.h"
 #include "client/report/ResultOutput.h"
 #include "client/text/DisplayText.h"
-#include "host/TAddToVectorCallback.h"
 
 namespace NORVZEL20 {
 
@@ -19,9 +19,7 @@ std::string WriteClass(const TInventory& inventory, const TShowOptions& options)
         throw TClientError(inventory.path + ": declares no class " + EscapeForDisplay(options.className) + "; cimdelta show " +
                            inventory.path + " lists those it declares");
     }
-    std::vector<boost::shared_ptr<ICIMInstance>> instances;
-    cls->EnumerateInstances(TAddToVectorCallback<ICIMInstance>(&instances), true, TCallContext());
-    return WriteInstances(inventory, instances, {}, options.format);
+    return WriteInstances(inventory, InstancesOfTree(*cls), {}, options.format);
 }
 
 }  // namespace

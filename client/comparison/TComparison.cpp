@@ -2,6 +2,7 @@
 
 #include <algorithm>
 
+#include "client/comparison/ReadDeltaRecords.h"
 #include "client/comparison/StaticValues.h"
 #include "client/comparison/TComparisonFault.h"
 #include "client/comparison/TCoverageBuilder.h"
@@ -14,7 +15,6 @@
 #include "client/rules/MadeRules.h"
 #include "client/rules/TLogCapture.h"
 #include "embedded/services/TAssertionFailure.h"
-#include "host/TAddToVectorCallback.h"
 #include "host/TNamespaceProviderManager.h"
 #include "host/TZELException.h"
 #include "provider/DeltaNames.h"
@@ -50,24 +50,6 @@ void KeepForever(const boost::shared_ptr<TDeltaNamespace>& records)
 {
     static auto* const fgKept = new std::vector<boost::shared_ptr<TDeltaNamespace>>;
     fgKept->push_back(records);
-}
-
-// Takes a position off all records.
-void ForgetPosition(TDeltaNamespace& records, std::size_t position)
-{
-    std::vector<boost::shared_ptr<ICIMInstance>> deltas;
-    std::string language = "WQL";
-    std::string query = std::string("SELECT * FROM ") + kDeltaRecord;
-    records.ExecuteQuery(TAddToVectorCallback<ICIMInstance>(&deltas), language, query, TCallContext());
-    for (const boost::shared_ptr<ICIMInstance>& delta : deltas) {
-        std::vector<TCIMValue> indices =
-            delta->GetProperty(kDeltaRecordIndices, TCallContext())->GetValue(TCallContext()).GetElements();
-        indices.erase(std::remove_if(indices.begin(), indices.end(),
-                                     [position](const TCIMValue& index) { return index.GetUnsigned() == position; }),
-                      indices.end());
-        const TCIMValue kept(TCIMValue::TCIMType::kArrayUint16, static_cast<unsigned int>(indices.size()), indices);
-        records.ModifyInstance(delta->GetReference(TCallContext()), {{kDeltaRecordIndices, kept}}, TCallContext());
-    }
 }
 
 }  // namespace
@@ -125,7 +107,7 @@ void TComparison::FindDifferences(TDeltaNamespace& records, TRules& rules)
         throw TClientError(std::string("the comparison failed: ") + error.what());
     }
     if (twice) {
-        ForgetPosition(records, fInventories.size());
+        RemovePosition(records, fInventories.size());
     }
 }
 

@@ -1,7 +1,7 @@
 #include "client/comparison/TComparisonFault.h"
 
-#include "client/inventory/CimWalk.h"
-#include "client/inventory/OperatingSystem.h"
+#include "client/inventory/CollectObjects.h"
+#include "client/inventory/PropertyValue.h"
 #include "embedded/value/TValueText.h"
 #include "host/TZELException.h"
 #include "provider/DeltaNames.h"
@@ -19,8 +19,7 @@ std::string Name(const ICIMClass& cls)
 bool HasUsableType(TInMemClass& systems)
 {
     try {
-        const unsigned short type =
-            InstancesOf(systems).at(0)->GetProperty(kOperatingSystemType, TCallContext())->GetValue(TCallContext());
+        const unsigned short type = ValueOf(*InstancesOf(systems).at(0), kOperatingSystemType);
         static_cast<void>(type);
         return true;
     } catch (const TZELException&) {

@@ -3,7 +3,9 @@
 #include <algorithm>
 #include <tuple>
 
-#include "client/inventory/CimWalk.h"
+#include "client/comparison/ReadDeltaRecords.h"
+#include "client/inventory/CollectObjects.h"
+#include "client/inventory/PropertyValue.h"
 #include "embedded/store/TInMemProperty.h"
 
 namespace NORVZEL20 {
@@ -147,7 +149,7 @@ std::vector<TCIMValue> TDifferenceReader::OtherValues(const TDifference& differe
 {
     std::vector<TCIMValue> values;
     for (const boost::shared_ptr<ICIMInstance>& instance : Index(inventory).Find(difference.instance)) {
-        values.push_back(instance->GetProperty(difference.property, TCallContext())->GetValue(TCallContext()));
+        values.push_back(ValueOf(*instance, difference.property));
     }
     if (values.size() > 1) {
         values.erase(std::remove_if(values.begin(), values.end(),

@@ -4,7 +4,7 @@
 #include <string>
 #include <vector>
 
-#include "client/comparison/DeltaRecords.h"
+#include "client/comparison/TDeltaRecord.h"
 #include "client/comparison/TDifference.h"
 #include "client/comparison/TInstanceIndex.h"
 #include "client/inventory/TInventory.h"

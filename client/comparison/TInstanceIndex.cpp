@@ -1,6 +1,7 @@
 #include "client/comparison/TInstanceIndex.h"
 
-#include "client/inventory/CimWalk.h"
+#include "client/inventory/CollectObjects.h"
+#include "client/inventory/FindDeclarations.h"
 
 namespace NORVZEL20 {
 

@@ -1,6 +1,6 @@
 #include "client/inventory/CompleteInventories.h"
 
-#include "client/inventory/OperatingSystem.h"
+#include "client/inventory/MakeMissingOperatingSystems.h"
 #include "client/inventory/TSchemaCompletion.h"
 #include "provider/DeltaNames.h"
 

@@ -2,7 +2,8 @@
 
 #include <set>
 
-#include "client/inventory/CimWalk.h"
+#include "client/inventory/CollectObjects.h"
+#include "client/inventory/FindDeclarations.h"
 #include "client/report/JsonValue.h"
 #include "client/text/Counted.h"
 #include "client/text/DisplayText.h"

@@ -3,7 +3,7 @@
 #include <algorithm>
 #include <set>
 
-#include "client/inventory/CimWalk.h"
+#include "client/inventory/CollectObjects.h"
 #include "embedded/value/TNameText.h"
 
 namespace NORVZEL20 {

@@ -1,5 +1,5 @@
 // Class trees that are taller, and classes that are wider, than any schema's.
-#include "client/inventory/CimWalk.h"
+#include "client/inventory/CollectObjects.h"
 #include "client/rules/TRuleTrace.h"
 #include "embedded/store/TInMemNamespace.h"
 #include "tests/client/ClientTest.h"

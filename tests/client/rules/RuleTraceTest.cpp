@@ -4,7 +4,7 @@
 
 #include <random>
 
-#include "client/inventory/CimWalk.h"
+#include "client/inventory/CollectObjects.h"
 #include "embedded/store/TInMemNamespace.h"
 #include "spec/TDiffClassRules.h"
 

@@ -1,8 +1,10 @@
-#include "client/inventory/OperatingSystem.h"
+#include "client/inventory/MakeMissingOperatingSystems.h"
 
 #include <algorithm>
 
-#include "client/inventory/CimWalk.h"
+#include "client/inventory/CollectObjects.h"
+#include "client/inventory/FindDeclarations.h"
+#include "client/inventory/PropertyValue.h"
 #include "client/process/TClientError.h"
 #include "embedded/store/TSchemaCopier.h"
 #include "embedded/value/TValueText.h"

@@ -1,0 +1,107 @@
+// The records of a run are three kinds of instances in the delta namespace: a KALMO_DeltaClass for each class with differences, a
+// KALMO_Delta for each difference, and a KALMO_DeltaClassAssocToDelta that joins a KALMO_Delta to its class:
+//
+//   KALMO_DeltaClass { ClassName }  <-- Class -- KALMO_DeltaClassAssocToDelta -- Delta -->  KALMO_Delta { Type, InstanceName, ... }
+//
+// One query lists the associations. Both ends of each are then fetched by their paths; since the associations of a class follow
+// each other, the class's record is fetched only if the path has changed.
+#include "client/comparison/ReadDeltaRecords.h"
+
+#include <algorithm>
+
+#include "client/inventory/CollectObjects.h"
+#include "client/inventory/PropertyValue.h"
+#include "provider/DeltaNames.h"
+
+namespace NORVZEL20 {
+
+namespace {
+
+template <class TCallback>
+void EnumerateAll(TDeltaNamespace& ns, const std::string& recordClass, const TCallback& callback)
+{
+    std::string language = "WQL";
+    std::string query = "SELECT * FROM " + recordClass;
+    ns.ExecuteQuery(callback, language, query, TCallContext());
+}
+
+std::string TextOf(const ICIMInstance& instance, const char* property)
+{
+    return std::string(ValueOf(instance, property).GetString());
+}
+
+TDeltaRecord MakeRecord(const ICIMInstance& delta)
+{
+    TDeltaRecord record;
+    record.type = static_cast<TDeltaNamespace::EDeltaType>(ValueOf(delta, kDeltaRecordType).GetUnsigned());
+    record.instanceName = TextOf(delta, kDeltaRecordInstance);
+    record.property = TextOf(delta, kDeltaRecordProperty);
+    const TCIMValue indices = ValueOf(delta, kDeltaRecordIndices);
+    for (const TCIMValue& index : indices.GetElements()) {
+        record.inventories.push_back(index.GetUnsigned());
+    }
+    // With excluded keys a position occurs once for each instance that shares the key.
+    std::sort(record.inventories.begin(), record.inventories.end());
+    record.inventories.erase(std::unique(record.inventories.begin(), record.inventories.end()), record.inventories.end());
+    return record;
+}
+
+// Follows associations to both ends and keeps the records by class.
+class TAssociationReader {
+  public:
+    TAssociationReader(TDeltaNamespace& ns, std::map<std::string, std::vector<TDeltaRecord>>& records)
+        : fNamespace(ns), fRecords(records)
+    {}
+
+    void Read(const ICIMInstance& association)
+    {
+        const TCIMReference classPath = ValueOf(association, kDeltaAssociationClass);
+        const std::string path = classPath.GetPath();
+        if (fCurrent == nullptr || path != fCurrentPath) {
+            fCurrentPath = path;
+            fCurrent = &fRecords[TextOf(*fNamespace.GetInstance(classPath, TCallContext()), kClassRecordName)];
+        }
+        const TCIMReference deltaPath = ValueOf(association, kDeltaAssociationDelta);
+        fCurrent->push_back(MakeRecord(*fNamespace.GetInstance(deltaPath, TCallContext())));
+    }
+
+  private:
+    TDeltaNamespace& fNamespace;
+    std::map<std::string, std::vector<TDeltaRecord>>& fRecords;
+    std::string fCurrentPath;
+    std::vector<TDeltaRecord>* fCurrent = nullptr;
+};
+
+TCIMValue WithoutPosition(const TCIMValue& indices, std::size_t position)
+{
+    std::vector<TCIMValue> kept = indices.GetElements();
+    kept.erase(
+        std::remove_if(kept.begin(), kept.end(), [position](const TCIMValue& index) { return index.GetUnsigned() == position; }),
+        kept.end());
+    return TCIMValue(indices.GetType(), static_cast<unsigned int>(kept.size()), kept);
+}
+
+}  // namespace
+
+std::map<std::string, std::vector<TDeltaRecord>> ReadDeltaRecords(TDeltaNamespace& ns)
+{
+    std::map<std::string, std::vector<TDeltaRecord>> records;
+    TAssociationReader reader(ns, records);
+    EnumerateAll(ns, kDeltaAssociation, [&reader](const boost::shared_ptr<ICIMInstance>& association) {
+        reader.Read(*association);
+        return true;
+    });
+    return records;
+}
+
+void RemovePosition(TDeltaNamespace& ns, std::size_t position)
+{
+    // Collected first: changing instances during their enumeration is not allowed.
+    const auto deltas = Collect<ICIMInstance>([&ns](const auto& callback) { EnumerateAll(ns, kDeltaRecord, callback); });
+    for (const boost::shared_ptr<ICIMInstance>& delta : deltas) {
+        const TCIMValue kept = WithoutPosition(ValueOf(*delta, kDeltaRecordIndices), position);
+        ns.ModifyInstance(delta->GetReference(TCallContext()), {{kDeltaRecordIndices, kept}}, TCallContext());
+    }
+}
+
+}  // namespace NORVZEL20

@@ -1,0 +1,19 @@
+#pragma once
+
+#include <map>
+#include <string>
+#include <vector>
+
+#include "client/comparison/TDeltaRecord.h"
+
+namespace NORVZEL20 {
+
+/// The records of a delta namespace by the name of their class, in the order in which they were written.
+///
+/// Reads with ExecuteQuery and GetInstance alone, as any client of the host could. Errors: TZELException of the namespace.
+std::map<std::string, std::vector<TDeltaRecord>> ReadDeltaRecords(TDeltaNamespace& ns);
+
+/// Removes one position from the indices of every record. Errors: TZELException of the namespace.
+void RemovePosition(TDeltaNamespace& ns, std::size_t position);
+
+}  // namespace NORVZEL20
