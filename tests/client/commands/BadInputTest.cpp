@@ -1,9 +1,9 @@
-#include "tests/client/ClientTest.h"
+#include "tests/client/TClientFixture.h"
 
 namespace NORVZEL20 {
 namespace {
 
-class BadInputTest : public ClientTest {};
+class BadInputTest : public TClientFixture {};
 
 TEST_F(BadInputTest, EachUnusableRulesFileGetsOneMessage)
 {

@@ -1,9 +1,9 @@
-#include "tests/client/ClientTest.h"
+#include "tests/client/TClientFixture.h"
 
 namespace NORVZEL20 {
 namespace {
 
-class CompareTest : public ClientTest {
+class CompareTest : public TClientFixture {
   protected:
     /// The inventory without its last instance.
     static std::string WithoutLast(std::string inventory)

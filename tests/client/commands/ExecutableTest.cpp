@@ -2,12 +2,12 @@
 
 #include <cstdlib>
 
-#include "tests/client/ProgramTest.h"
+#include "tests/client/TProgramFixture.h"
 
 namespace NORVZEL20 {
 namespace {
 
-class ExecutableTest : public ProgramTest {};
+class ExecutableTest : public TProgramFixture {};
 
 const char kPackages[] =
     "[0]\nINV_Disk.BootId=1,Device=\"sda\"\n    Device: sda\n    BootId: 1\n    SizeMB: 500\n    Model: A 1\n--\n";

@@ -1,5 +1,5 @@
 #include "client/inventory/TInventoryLoader.h"
-#include "tests/client/ProgramTest.h"
+#include "tests/client/TProgramFixture.h"
 
 namespace NORVZEL20 {
 namespace {
@@ -10,7 +10,7 @@ const char kTwice[] = "<CIM CIMVERSION='2.0' DTDVERSION='2.0'><DECLARATION><DECL
                       "<VALUE.OBJECT><CLASS NAME='Disk'/></VALUE.OBJECT></DECLGROUP></DECLARATION></CIM>";
 
 /// More inventories than are loaded at a time.
-class ManyInventoriesTest : public ProgramTest {
+class ManyInventoriesTest : public TProgramFixture {
   protected:
     /// That many copies of an inventory, the one at `at` another one.
     static std::vector<std::string> Inventories(const std::string& inventory, int at, const std::string& other)

@@ -1,9 +1,9 @@
-#include "tests/client/ClientTest.h"
+#include "tests/client/TClientFixture.h"
 
 namespace NORVZEL20 {
 namespace {
 
-class QueryAndShowTest : public ClientTest {};
+class QueryAndShowTest : public TClientFixture {};
 
 TEST_F(QueryAndShowTest, AQueryGivesTheListedPropertiesInItsOrder)
 {

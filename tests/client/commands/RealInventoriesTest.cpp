@@ -2,13 +2,13 @@
 #include <set>
 
 #include "client/inventory/TInventoryFile.h"
-#include "tests/client/ClientTest.h"
+#include "tests/client/TClientFixture.h"
 
 namespace NORVZEL20 {
 namespace {
 
 /// Three states of a package index, compared with the list of what differs between them that came with the data.
-class RealInventoriesTest : public ClientTest {
+class RealInventoriesTest : public TClientFixture {
   protected:
     void SetUp() override { ASSERT_EQ(0, chdir(CIMDELTA_PAIR_DATA)); }
 

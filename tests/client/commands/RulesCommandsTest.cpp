@@ -1,9 +1,9 @@
-#include "tests/client/ClientTest.h"
+#include "tests/client/TClientFixture.h"
 
 namespace NORVZEL20 {
 namespace {
 
-class RulesCommandsTest : public ClientTest {};
+class RulesCommandsTest : public TClientFixture {};
 
 TEST_F(RulesCommandsTest, CheckTellsElementsAndEffectiveRules)
 {

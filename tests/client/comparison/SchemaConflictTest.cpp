@@ -1,10 +1,10 @@
-#include "tests/client/PairTest.h"
+#include "tests/client/TPairFixture.h"
 
 namespace NORVZEL20 {
 namespace {
 
 /// Inventories whose declarations do not fit together: the complaint names them, and what to do.
-class SchemaConflictTest : public PairTest {};
+class SchemaConflictTest : public TPairFixture {};
 
 TEST_F(SchemaConflictTest, APropertyThatAClassBelowDeclaresOtherwise)
 {

@@ -1,4 +1,4 @@
-#include "tests/client/PairTest.h"
+#include "tests/client/TPairFixture.h"
 
 namespace NORVZEL20 {
 namespace {
@@ -23,7 +23,7 @@ const char kDisks[] = "Disk\n"
                       "    Firmware: old -> new\n"
                       "\n";
 
-class StaticValuesTest : public PairTest {};
+class StaticValuesTest : public TPairFixture {};
 
 TEST_F(StaticValuesTest, EveryInstanceOfAPairShowsTheValueBefore)
 {

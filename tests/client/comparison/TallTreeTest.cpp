@@ -2,12 +2,12 @@
 #include "client/inventory/CollectObjects.h"
 #include "client/rules/TRuleTrace.h"
 #include "embedded/store/TInMemNamespace.h"
-#include "tests/client/ClientTest.h"
+#include "tests/client/TClientFixture.h"
 
 namespace NORVZEL20 {
 namespace {
 
-using TallTreeTest = ClientTest;
+using TallTreeTest = TClientFixture;
 
 std::string Name(std::size_t number)
 {

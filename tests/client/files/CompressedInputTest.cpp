@@ -2,13 +2,13 @@
 
 #include <utility>
 
-#include "tests/client/ClientTest.h"
+#include "tests/client/TClientFixture.h"
 
 namespace NORVZEL20 {
 namespace {
 
 /// Inventories whose compressed data was damaged on the way.
-class CompressedInputTest : public ClientTest {
+class CompressedInputTest : public TClientFixture {
   protected:
     /// What comes of showing a file of that content: its text, or the message, in which the file is called F.
     std::string Show(const std::string& content)

@@ -7,8 +7,8 @@
 #include <cstdlib>
 #include <thread>
 
-#include "tests/client/ProgramTest.h"
 #include "tests/client/TOutputFolder.h"
+#include "tests/client/TProgramFixture.h"
 #include "tests/client/TStartedProgram.h"
 
 namespace NORVZEL20 {
@@ -18,11 +18,11 @@ const char kLarge[] = CIMDELTA_PAIR_DATA "/a.xml.xz";
 const char kBefore[] = "what was there before";
 
 /// Results that do not get where they are to go: the program is ended, or the other end goes or waits.
-class InterruptedOutputTest : public ProgramTest {
+class InterruptedOutputTest : public TProgramFixture {
   protected:
     void SetUp() override
     {
-        ProgramTest::SetUp();
+        TProgramFixture::SetUp();
         // Some of the signals write a core file where that is allowed.
         struct rlimit core = {};
         ASSERT_EQ(0, getrlimit(RLIMIT_CORE, &core));

@@ -3,7 +3,7 @@
 #include <chrono>
 #include <thread>
 
-#include "tests/client/ClientTest.h"
+#include "tests/client/TClientFixture.h"
 #include "tests/client/files/TSystemCalls.h"
 
 namespace NORVZEL20 {
@@ -12,7 +12,7 @@ namespace {
 const char* const kForms[] = {"web02.xml", "web02.xml.gz", "web02.xml.xz", "web02.xml.zst"};
 
 /// Inventories that are read with faults, in each form.
-class ReadingFaultTest : public ClientTest {
+class ReadingFaultTest : public TClientFixture {
   protected:
     std::string Show(const std::string& file)
     {

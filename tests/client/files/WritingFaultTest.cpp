@@ -5,7 +5,7 @@
 
 #include "client/process/TClientError.h"
 #include "client/process/TStandardConsole.h"
-#include "tests/client/ClientTest.h"
+#include "tests/client/TClientFixture.h"
 #include "tests/client/TOutputFolder.h"
 #include "tests/client/files/TSystemCalls.h"
 
@@ -15,11 +15,11 @@ namespace {
 const char kBefore[] = "what was there before";
 
 /// Results that are written while a call of the operating system fails.
-class WritingFaultTest : public ClientTest {
+class WritingFaultTest : public TClientFixture {
   protected:
     void SetUp() override
     {
-        ClientTest::SetUp();
+        TClientFixture::SetUp();
         std::ofstream(fReport, std::ios::binary) << kBefore;
     }
 

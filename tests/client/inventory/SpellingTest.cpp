@@ -1,10 +1,10 @@
-#include "tests/client/PairTest.h"
+#include "tests/client/TPairFixture.h"
 
 namespace NORVZEL20 {
 namespace {
 
 /// Inventories that say the same in other words: compared, they are equal.
-class SpellingTest : public PairTest {};
+class SpellingTest : public TPairFixture {};
 
 std::string Disks(const std::string& key, const std::string& binding)
 {

@@ -4,7 +4,7 @@
 #include <atomic>
 #include <cerrno>
 
-#include "tests/client/ClientTest.h"
+#include "tests/client/TClientFixture.h"
 
 namespace NORVZEL20 {
 namespace {
@@ -13,12 +13,12 @@ namespace {
 std::atomic<int> gLeft{-1};
 
 /// Threads that the operating system refuses.
-class ThreadFaultTest : public ClientTest {
+class ThreadFaultTest : public TClientFixture {
   protected:
     void TearDown() override
     {
         gLeft = -1;
-        ClientTest::TearDown();
+        TClientFixture::TearDown();
     }
 };
 

@@ -1,11 +1,11 @@
 #include <nlohmann/json.hpp>
 
-#include "tests/client/ClientTest.h"
+#include "tests/client/TClientFixture.h"
 
 namespace NORVZEL20 {
 namespace {
 
-class FormatsTest : public ClientTest {};
+class FormatsTest : public TClientFixture {};
 
 TEST_F(FormatsTest, NdjsonHasADocumentForEachDifferenceAndOneForTheCoverage)
 {

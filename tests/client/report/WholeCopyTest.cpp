@@ -1,10 +1,10 @@
-#include "tests/client/PairTest.h"
+#include "tests/client/TPairFixture.h"
 
 namespace NORVZEL20 {
 namespace {
 
 /// What `show -o cimxml` writes is the inventory again.
-class WholeCopyTest : public PairTest {
+class WholeCopyTest : public TPairFixture {
   protected:
     /// The first line of the comparison of the document with its copy.
     std::string CompareWithCopy(const std::string& document, const std::string& cls = std::string())

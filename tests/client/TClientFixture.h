@@ -14,7 +14,7 @@
 namespace NORVZEL20 {
 
 /// Runs commands as a person types them, among the test's inventories.
-class ClientTest : public ::testing::Test {
+class TClientFixture : public ::testing::Test {
   protected:
     void SetUp() override { ASSERT_EQ(0, chdir(CIMDELTA_CLIENT_TEST_DATA)); }
 

@@ -6,12 +6,12 @@
 #include <cstdio>
 #include <string>
 
-#include "tests/client/ClientTest.h"
+#include "tests/client/TClientFixture.h"
 
 namespace NORVZEL20 {
 
 /// Runs the built program itself, through a shell.
-class ProgramTest : public ClientTest {
+class TProgramFixture : public TClientFixture {
   protected:
     /// Gives exit status, standard output and standard error, one after the other.
     std::string Shell(const std::string& arguments, const std::string& before = std::string())

@@ -3,13 +3,13 @@
 #include <string>
 #include <vector>
 
-#include "tests/client/ClientTest.h"
 #include "tests/client/Documents.h"
+#include "tests/client/TClientFixture.h"
 
 namespace NORVZEL20 {
 
 /// Compares two documents that stand in the test itself.
-class PairTest : public ClientTest {
+class TPairFixture : public TClientFixture {
   protected:
     /// The report of the comparison, or the complaint; the documents are called "a" and "b", without the paths of their files.
     std::string Compare(const std::string& a, const std::string& b, const std::vector<std::string>& options = {})
