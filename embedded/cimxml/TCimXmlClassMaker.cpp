@@ -2,23 +2,20 @@
 
 #include <boost/smart_ptr/make_shared.hpp>
 
+#include "embedded/cimxml/MessageText.h"
 #include "embedded/store/TInMemQualifier.h"
 #include "embedded/store/TSchemaLimits.h"
 #include "embedded/value/TValueText.h"
 
 namespace NORVZEL20 {
 
-namespace {
-
 using EStatus = TZELStatusCode::EStatusCode;
-
-}  // namespace
 
 boost::shared_ptr<TInMemClass> TCimXmlClassMaker::Make(const TCimXmlDraft& draft, const boost::shared_ptr<TInMemClass>& super)
 {
     const TEmbeddedObject& object = draft.object;
     if (super && super->CountSuperClasses() >= TSchemaLimits::kMaxSuperClasses) {
-        fContext.Fail(EStatus::kParseError, "found class " + TCimXmlContext::Quote(object.GetClassName()) + " below more than " +
+        fContext.Fail(EStatus::kParseError, "found class " + Quote(object.GetClassName()) + " below more than " +
                                                 std::to_string(TSchemaLimits::kMaxSuperClasses) +
                                                 " superclasses; flatten the class tree");
     }
@@ -47,8 +44,8 @@ boost::shared_ptr<TInMemClass> TCimXmlClassMaker::Make(const TCimXmlDraft& draft
 
 void TCimXmlClassMaker::FailTooMany(std::size_t most, const char* what, const std::string& className) const
 {
-    fContext.Fail(EStatus::kParseError, "found more than " + std::to_string(most) + " " + what + " in class " +
-                                            TCimXmlContext::Quote(className) + ", inherited ones included; split it");
+    fContext.Fail(EStatus::kParseError, "found more than " + std::to_string(most) + " " + what + " in class " + Quote(className) +
+                                            ", inherited ones included; split it");
 }
 
 void TCimXmlClassMaker::AddProperty(TInMemClass& cls, const TEmbeddedObject::TProperty& property, const TInMemClass* super)
@@ -58,9 +55,9 @@ void TCimXmlClassMaker::AddProperty(TInMemClass& cls, const TEmbeddedObject::TPr
     const boost::shared_ptr<TInMemPropertyDecl> inherited =
         super != nullptr ? super->FindPropertyDecl(property.fName) : boost::shared_ptr<TInMemPropertyDecl>();
     if (inherited && inherited->GetType() != type) {
-        fContext.Fail(EStatus::kTypeMismatch, "found property " + TCimXmlContext::Quote(property.fName) + " of type " +
-                                                  TValueText::DescribeType(type) + " in class " +
-                                                  TCimXmlContext::Quote(cls.GetName()) + ", but a superclass declares it as " +
+        fContext.Fail(EStatus::kTypeMismatch, "found property " + Quote(property.fName) + " of type " +
+                                                  TValueText::DescribeType(type) + " in class " + Quote(cls.GetName()) +
+                                                  ", but a superclass declares it as " +
                                                   TValueText::DescribeType(inherited->GetType()));
     }
     if (inherited && property.fPropagated) {
@@ -71,8 +68,8 @@ void TCimXmlClassMaker::AddProperty(TInMemClass& cls, const TEmbeddedObject::TPr
     decl->SetArraySize(property.fArraySize);
     AddQualifiers(*decl, property.fQualifiers, inherited ? &inherited->GetQualifiers() : nullptr);
     if (!cls.AddPropertyDecl(decl)) {
-        fContext.Fail(EStatus::kParseError, "found a second declaration of property " + TCimXmlContext::Quote(property.fName) +
-                                                " in class " + TCimXmlContext::Quote(cls.GetName()));
+        fContext.Fail(EStatus::kParseError,
+                      "found a second declaration of property " + Quote(property.fName) + " in class " + Quote(cls.GetName()));
     }
 }
 
@@ -93,8 +90,8 @@ void TCimXmlClassMaker::AddMethod(TInMemClass& cls, const TEmbeddedObject::TMeth
     }
     AddQualifiers(*decl, method.fQualifiers, inherited ? &inherited->GetQualifiers() : nullptr);
     if (!cls.AddMethodDecl(decl)) {
-        fContext.Fail(EStatus::kParseError, "found a second declaration of method " + TCimXmlContext::Quote(method.fName) +
-                                                " in class " + TCimXmlContext::Quote(cls.GetName()));
+        fContext.Fail(EStatus::kParseError,
+                      "found a second declaration of method " + Quote(method.fName) + " in class " + Quote(cls.GetName()));
     }
 }
 
@@ -123,11 +120,11 @@ void TCimXmlClassMaker::NoteQualifier(const TEmbeddedObject::TQualifier& qualifi
 {
     if (!fNamespace.FindQualifierDecl(qualifier.fName)) {
         fContext.Tolerate("undeclared qualifier",
-                          "qualifier " + TCimXmlContext::Quote(qualifier.fName) + " is not declared; taken as it is written");
+                          "qualifier " + Quote(qualifier.fName) + " is not declared; taken as it is written");
     }
     if (inherited != nullptr && inherited->GetFlavor(TCallContext()) != qualifier.fFlavor) {
         fContext.Tolerate("other flavor",
-                          "qualifier " + TCimXmlContext::Quote(qualifier.fName) +
+                          "qualifier " + Quote(qualifier.fName) +
                               " is restated with another flavor than the superclass gives it; taken as it is written");
     }
 }

@@ -2,9 +2,9 @@
 
 #include <algorithm>
 
+#include "embedded/cimxml/MessageText.h"
 #include "embedded/cimxml/TXmlReader.h"
 #include "embedded/value/TNameText.h"
-#include "embedded/value/TUtf8.h"
 
 namespace NORVZEL20 {
 
@@ -68,17 +68,6 @@ void TCimXmlContext::CheckName(const char* what, std::string_view name) const
         Fail(TZELStatusCode::kParseError,
              std::string("found ") + what + " " + Quote(name) + ", expected a name of letters, digits and underscores");
     }
-}
-
-std::string TCimXmlContext::Quote(std::string_view text)
-{
-    constexpr std::size_t kLongest = 80;
-    const std::string_view start = TUtf8::Shorten(text, kLongest);
-    std::string quoted = "\"";
-    for (const char c : start) {
-        quoted += static_cast<unsigned char>(c) < ' ' ? '.' : c;
-    }
-    return quoted + (text.size() > kLongest ? "...\"" : "\"");
 }
 
 }  // namespace NORVZEL20

@@ -80,9 +80,6 @@ class TCimXmlContext {
         }
     }
 
-    /// Text for a message: in double quotes, cut where it is long, control characters shown as dots.
-    static std::string Quote(std::string_view text);
-
   private:
     std::string fFile;
     const TXmlReader* fReader = nullptr;

@@ -2,6 +2,7 @@
 
 #include <utility>
 
+#include "embedded/cimxml/MessageText.h"
 #include "embedded/store/TSchemaLimits.h"
 #include "embedded/value/TValueText.h"
 
@@ -33,7 +34,7 @@ void TCimXmlDraftBuilder::CheckRoom(std::size_t count, std::size_t most, const c
     if (count >= most) {
         fContext.Fail(EStatus::kParseError, "found more than " + std::to_string(most) + " " + what + " in " +
                                                 (fDraft->object.IsClass() ? "class " : "an instance of class ") +
-                                                TCimXmlContext::Quote(fDraft->object.GetClassName()) + "; split it");
+                                                Quote(fDraft->object.GetClassName()) + "; split it");
     }
 }
 
@@ -41,7 +42,7 @@ void TCimXmlDraftBuilder::BeginProperty(const char* name, const TCimXmlAttribute
 {
     CheckRoom(fDraft->object.GetProperties().size(), TSchemaLimits::kMaxProperties, "properties");
     if (fDraft->object.FindProperty(name) != nullptr) {
-        fContext.Fail(EStatus::kParseError, "found property " + TCimXmlContext::Quote(name) + " a second time in one " +
+        fContext.Fail(EStatus::kParseError, "found property " + Quote(name) + " a second time in one " +
                                                 (fDraft->object.IsClass() ? "class" : "instance"));
     }
     fPropertyPlace = fContext.GetPlace();
@@ -136,7 +137,7 @@ unsigned int TCimXmlDraftBuilder::ReadArraySize(const TCimXmlAttributes& attribu
     }
     TCIMValue size;
     if (!TValueText::Parse(TCIMValue::TCIMType::kUint32, text, size)) {
-        fContext.Fail(EStatus::kParseError, "found the array size " + TCimXmlContext::Quote(text) + ", expected a number");
+        fContext.Fail(EStatus::kParseError, "found the array size " + Quote(text) + ", expected a number");
     }
     return static_cast<unsigned int>(size.GetUnsigned());
 }

@@ -3,6 +3,7 @@
 #include <algorithm>
 #include <boost/smart_ptr/make_shared.hpp>
 
+#include "embedded/cimxml/MessageText.h"
 #include "embedded/cimxml/TCimXmlClassMaker.h"
 #include "embedded/cimxml/TCimXmlObjects.h"
 #include "embedded/store/TReferenceAdapter.h"
@@ -13,11 +14,6 @@ namespace NORVZEL20 {
 namespace {
 
 using EStatus = TZELStatusCode::EStatusCode;
-
-std::string Quote(std::string_view text)
-{
-    return TCimXmlContext::Quote(text);
-}
 
 /// Whether text in the property is an embedded object: what its qualifiers say, for documents that do not mark the value.
 bool HoldsObjects(const TInMemPropertyDecl& decl)

@@ -2,6 +2,7 @@
 
 #include <cstring>
 
+#include "embedded/cimxml/MessageText.h"
 #include "embedded/store/TReferenceAdapter.h"
 #include "embedded/store/TSchemaLimits.h"
 #include "embedded/value/TNameText.h"
@@ -137,7 +138,7 @@ void TCimXmlPathReader::AddNamespace(const char* name)
         fNamespaceName += '/';
     }
     if (std::strpbrk(name, ":=\"") != nullptr) {
-        fContext.Fail(EStatus::kParseError, "found namespace " + TCimXmlContext::Quote(name) + ", expected a name without \":=");
+        fContext.Fail(EStatus::kParseError, "found namespace " + Quote(name) + ", expected a name without \":=");
     }
     fNamespaceName += name;
 }
@@ -145,7 +146,7 @@ void TCimXmlPathReader::AddNamespace(const char* name)
 void TCimXmlPathReader::SetHost(std::string_view host)
 {
     if (!fHost.empty() || host.find('/') != std::string_view::npos) {
-        fContext.Fail(EStatus::kParseError, "found host " + TCimXmlContext::Quote(host) + ", expected one, without a slash");
+        fContext.Fail(EStatus::kParseError, "found host " + Quote(host) + ", expected one, without a slash");
     }
     fHost = host;
 }
@@ -182,7 +183,7 @@ void TCimXmlPathReader::EndKeyBinding()
     TFrame& frame = fFrames[fDepth - 1];
     if (!frame.keyName.empty()) {
         fContext.Fail(EStatus::kParseError,
-                      "found key " + TCimXmlContext::Quote(frame.keyName) +
+                      "found key " + Quote(frame.keyName) +
                           " without a value, expected a <KEYVALUE> or a <VALUE.REFERENCE> in its <KEYBINDING>");
     }
     frame.isInBinding = false;
@@ -226,8 +227,7 @@ TCIMValue TCimXmlPathReader::ReadKey(std::string_view text)
         return value;
     }
     const std::string expected = type != TType::kNone ? fType : fValueType == "boolean" ? "boolean" : "number";
-    fContext.Fail(EStatus::kTypeMismatch,
-                  "found " + TCimXmlContext::Quote(text) + " as the value of a key, expected a " + expected);
+    fContext.Fail(EStatus::kTypeMismatch, "found " + Quote(text) + " as the value of a key, expected a " + expected);
 }
 
 }  // namespace NORVZEL20

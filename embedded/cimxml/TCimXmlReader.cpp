@@ -5,6 +5,7 @@
 #include <cstring>
 #include <utility>
 
+#include "embedded/cimxml/MessageText.h"
 #include "embedded/value/TValueAccess.h"
 #include "embedded/value/TValueText.h"
 
@@ -16,11 +17,6 @@ using TType = TCIMValue::TCIMType;
 namespace {
 
 constexpr std::size_t kMaxEmbeddedDepth = 32;
-
-std::string Quote(std::string_view text)
-{
-    return TCimXmlContext::Quote(text);
-}
 
 bool IsBlank(char c)
 {
@@ -315,7 +311,7 @@ void TCimXmlReader::BeginArray()
     fElements.clear();
     if (GetState() == TTable::kReferenceArray && fItem->type.GetElementType() != TType::kReference) {
         fContext.Fail(EStatus::kTypeMismatch, "found an array of references as value of " + Quote(fItem->name) + ", expected a " +
-                                                  TValueText::GetTypeName(fItem->type) + "[]");
+                                                  TValueText::DescribeType(fItem->type.GetArrayType()));
     }
 }
 

@@ -3,6 +3,7 @@
 #include <boost/smart_ptr/make_shared.hpp>
 #include <utility>
 
+#include "embedded/cimxml/MessageText.h"
 #include "embedded/value/TValueText.h"
 
 // What TCimXmlReader does for declarations and for the frames of messages, and what it says of what it cannot read.
@@ -99,8 +100,8 @@ void TCimXmlReader::EndQualifier()
     TCIMValue value = TakeValue(fQualifier);
     fItem = &fProperty;
     if (fDirect) {
-        return fContext.Tolerate("qualifier of an instance", "qualifier " + TCimXmlContext::Quote(fQualifier.name) +
-                                                                 " stands on an instance or its property; left out");
+        return fContext.Tolerate("qualifier of an instance",
+                                 "qualifier " + Quote(fQualifier.name) + " stands on an instance or its property; left out");
     }
     fDraft.AddQualifier({fQualifierName, std::move(value), fFlavor, fPropagated});
 }
@@ -141,7 +142,7 @@ void TCimXmlReader::EndQualifierDecl()
 void TCimXmlReader::ReadError(const TCimXmlAttributes& attributes) const
 {
     fContext.Fail(EStatus::kParseError, std::string("found a response with error ") + attributes.Get("CODE") + " (" +
-                                            TCimXmlContext::Quote(attributes.Get("DESCRIPTION")) + "), expected one with objects");
+                                            Quote(attributes.Get("DESCRIPTION")) + "), expected one with objects");
 }
 
 void TCimXmlReader::NoteSkipped()
@@ -155,7 +156,7 @@ void TCimXmlReader::FailUnexpected(const char* name) const
     const TOpen& open = fOpen.back();
     const std::string place = open.element == TElement::kUnknown ? " as the outermost element"
                                                                  : std::string(" in <") + TElement::GetName(open.element) + ">";
-    const std::string shown = TCimXmlContext::Quote(name);
+    const std::string shown = Quote(name);
     fContext.Fail(EStatus::kParseError, "found element <" + shown.substr(1, shown.size() - 2) + ">" + place + ", expected " +
                                             TTable::DescribeExpected(open.state));
 }
@@ -174,8 +175,7 @@ TType TCimXmlReader::ReadType(const char* text) const
 {
     const TType type = TValueText::FindType(text);
     if (type == TType::kNone) {
-        fContext.Fail(EStatus::kParseError,
-                      "found type " + TCimXmlContext::Quote(text) + ", expected a CIM type such as string or uint32");
+        fContext.Fail(EStatus::kParseError, "found type " + Quote(text) + ", expected a CIM type such as string or uint32");
     }
     return type;
 }

@@ -1,0 +1,17 @@
+#include "embedded/cimxml/MessageText.h"
+
+#include "embedded/value/TUtf8.h"
+
+namespace NORVZEL20 {
+
+std::string Quote(std::string_view text)
+{
+    constexpr std::size_t kLongest = 80;
+    std::string quoted = "\"";
+    for (const char c : TUtf8::Shorten(text, kLongest)) {
+        quoted += static_cast<unsigned char>(c) < ' ' ? '.' : c;
+    }
+    return quoted + (text.size() > kLongest ? "...\"" : "\"");
+}
+
+}  // namespace NORVZEL20
