@@ -3,6 +3,7 @@
 #include <algorithm>
 #include <utility>
 
+#include "embedded/cimxml/CimXmlFlags.h"
 #include "embedded/cimxml/TCimXmlObjects.h"
 #include "embedded/value/TValueText.h"
 #include "embedded/value/TValueXml.h"
@@ -22,14 +23,10 @@ void AppendFlag(std::string& out, const char* name, bool value)
 
 void AppendScope(std::string& out, TDecl::EScope scope)
 {
-    static constexpr std::pair<const char*, TDecl::EScope> kScopes[] = {
-        {"CLASS", TDecl::kScopeClass},          {"ASSOCIATION", TDecl::kScopeAssociation}, {"REFERENCE", TDecl::kScopeReference},
-        {"PROPERTY", TDecl::kScopeProperty},    {"METHOD", TDecl::kScopeMethod},           {"PARAMETER", TDecl::kScopeParameter},
-        {"INDICATION", TDecl::kScopeIndication}};
     out += "<SCOPE";
-    for (const auto& [name, bit] : kScopes) {
-        if ((scope & bit) != 0) {
-            AppendFlag(out, name, true);
+    for (const TCimXmlFlag& flag : kCimXmlScopes) {
+        if ((scope & flag.bit) != 0) {
+            AppendFlag(out, flag.attribute, true);
         }
     }
     out += "/>";
@@ -62,10 +59,9 @@ void AppendQualifierDecl(std::string& out, const ICIMQualifierDecl& decl)
     TValueXml::AppendAttribute(out, "NAME", decl.GetName(TCallContext()));
     TValueXml::AppendAttribute(out, "TYPE", TValueText::GetTypeName(value.GetType()));
     AppendFlag(out, "ISARRAY", value.GetType().IsArray());
-    AppendFlag(out, "OVERRIDABLE", (flavor & TDecl::kFlavorOverridable) != 0);
-    AppendFlag(out, "TOSUBCLASS", (flavor & TDecl::kFlavorToSubclass) != 0);
-    AppendFlag(out, "TOINSTANCE", (flavor & TDecl::kFlavorToInstance) != 0);
-    AppendFlag(out, "TRANSLATABLE", (flavor & TDecl::kFlavorTranslatable) != 0);
+    for (const TCimXmlFlag& flag : kCimXmlFlavors) {
+        AppendFlag(out, flag.attribute, (flavor & flag.bit) != 0);
+    }
     out += '>';
     AppendScope(out, decl.GetScope(TCallContext()));
     TValueXml::AppendValue(out, value);
