@@ -15,6 +15,15 @@ void TCimXmlContext::Fail(TZELStatusCode::EStatusCode status, const std::string&
                          place.column);
 }
 
+void TCimXmlContext::EnterEmbeddedObject()
+{
+    constexpr std::size_t kMaxDepth = 32;
+    if (fEmbeddedDepth == kMaxDepth) {
+        Fail(TZELStatusCode::kParseError, "embedded objects are nested too deeply");
+    }
+    ++fEmbeddedDepth;
+}
+
 TCimXmlContext::TPlace TCimXmlContext::GetPlace() const
 {
     return fPlace.line > 0 ? fPlace : TPlace{fReader->GetLine(), fReader->GetColumn()};

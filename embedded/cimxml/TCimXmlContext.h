@@ -60,8 +60,10 @@ class TCimXmlContext {
     TLoadReport& GetReport() noexcept { return fReport; }
     TTextPool& GetTexts() noexcept { return fTexts; }
 
-    /// How many embedded objects are being read, one within the other.
-    std::size_t fEmbeddedDepth = 0;
+    /// Brackets the reading of an embedded object, whose errors say so. Errors: fails with kParseError (9) if objects are nested
+    /// too deeply. An error ends the load, so whoever throws need not leave.
+    void EnterEmbeddedObject();
+    void LeaveEmbeddedObject() noexcept { --fEmbeddedDepth; }
 
     /// Fails with status 9 where `name` is none that a path can hold: of letters, digits and underscores, or beyond ASCII. `what`
     /// says what it is the name of.
@@ -87,6 +89,7 @@ class TCimXmlContext {
     TLoadReport fReport;
     std::vector<const char*> fKinds;  // of fReport.tolerated
     TTextPool fTexts;
+    std::size_t fEmbeddedDepth = 0;  // embedded objects that are being read, one within the other
 };
 
 }  // namespace NORVZEL20

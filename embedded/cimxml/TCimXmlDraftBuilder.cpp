@@ -9,11 +9,12 @@
 namespace NORVZEL20 {
 
 using EStatus = TZELStatusCode::EStatusCode;
+using TType = TCIMValue::TCIMType;
 
-void TCimXmlDraftBuilder::BeginClass(const char* name, const char* superClass)
+void TCimXmlDraftBuilder::BeginClass(const TCimXmlAttributes& attributes)
 {
-    fDraft.emplace(TCimXmlDraft{TEmbeddedObject(name, true), fContext.GetPlace(), {}, {}});
-    fDraft->object.SetSuperClassName(superClass);
+    fDraft.emplace(TCimXmlDraft{TEmbeddedObject(attributes.Require("NAME"), true), fContext.GetPlace(), {}, {}});
+    fDraft->object.SetSuperClassName(attributes.Get("SUPERCLASS"));
 }
 
 void TCimXmlDraftBuilder::BeginInstance(const char* className)
@@ -62,8 +63,11 @@ void TCimXmlDraftBuilder::EndProperty(TCIMValue value)
     fProperty.reset();
 }
 
-void TCimXmlDraftBuilder::BeginMethod(const char* name, TCIMValue::TCIMType type, const TCimXmlAttributes& attributes)
+void TCimXmlDraftBuilder::BeginMethod(const TCimXmlAttributes& attributes)
 {
+    const char* typeName = attributes.Find("TYPE");
+    const TType type = typeName != nullptr ? attributes.ReadType(typeName) : TType(TType::kNone);
+    const char* name = attributes.Require("NAME");
     CheckRoom(fDraft->object.GetMethods().size(), TSchemaLimits::kMaxMethods, "methods");
     fMethod.emplace();
     fMethod->fName = name;
@@ -78,11 +82,16 @@ void TCimXmlDraftBuilder::EndMethod()
     fMethod.reset();
 }
 
-void TCimXmlDraftBuilder::BeginParameter(const char* name, TCIMValue::TCIMType type, const TCimXmlAttributes& attributes)
+void TCimXmlDraftBuilder::BeginParameter(const TCimXmlAttributes& attributes)
 {
+    const TCimXmlElement::EElement element = attributes.GetElement();
+    const bool isReference = element == TCimXmlElement::kParameterReference || element == TCimXmlElement::kParameterRefArray;
+    const bool isArray = element == TCimXmlElement::kParameterArray || element == TCimXmlElement::kParameterRefArray;
+    const TType type = isReference ? TType(TType::kReference) : attributes.RequireType();
+    const char* name = attributes.Require("NAME");
     fParameter.emplace();
     fParameter->fName = name;
-    fParameter->fType = type;
+    fParameter->fType = isArray ? type.GetArrayType() : type;
     fParameter->fReferenceClass = attributes.Get("REFERENCECLASS");
     fParameter->fArraySize = ReadArraySize(attributes);
 }
@@ -111,24 +120,6 @@ void TCimXmlDraftBuilder::AddQualifier(TEmbeddedObject::TQualifier qualifier)
     }
 }
 
-ICIMQualifierDecl::EFlavor TCimXmlDraftBuilder::ReadFlavor(const TCimXmlAttributes& attributes)
-{
-    unsigned int flavor = ICIMQualifierDecl::kFlavorNone;
-    if (attributes.IsTrue("OVERRIDABLE", true)) {
-        flavor |= ICIMQualifierDecl::kFlavorOverridable;
-    }
-    if (attributes.IsTrue("TOSUBCLASS", true)) {
-        flavor |= ICIMQualifierDecl::kFlavorToSubclass;
-    }
-    if (attributes.IsTrue("TOINSTANCE", false)) {
-        flavor |= ICIMQualifierDecl::kFlavorToInstance;
-    }
-    if (attributes.IsTrue("TRANSLATABLE", false)) {
-        flavor |= ICIMQualifierDecl::kFlavorTranslatable;
-    }
-    return ICIMQualifierDecl::EFlavor(flavor);
-}
-
 unsigned int TCimXmlDraftBuilder::ReadArraySize(const TCimXmlAttributes& attributes) const
 {
     const char* text = attributes.Find("ARRAYSIZE");
@@ -136,7 +127,7 @@ unsigned int TCimXmlDraftBuilder::ReadArraySize(const TCimXmlAttributes& attribu
         return 0;
     }
     TCIMValue size;
-    if (!TValueText::Parse(TCIMValue::TCIMType::kUint32, text, size)) {
+    if (!TValueText::Parse(TType::kUint32, text, size)) {
         fContext.Fail(EStatus::kParseError, "found the array size " + Quote(text) + ", expected a number");
     }
     return static_cast<unsigned int>(size.GetUnsigned());

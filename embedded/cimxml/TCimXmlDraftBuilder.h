@@ -16,7 +16,7 @@ class TCimXmlDraftBuilder {
   public:
     explicit TCimXmlDraftBuilder(TCimXmlContext& context) : fContext(context) {}
 
-    void BeginClass(const char* name, const char* superClass);
+    void BeginClass(const TCimXmlAttributes& attributes);
     void BeginInstance(const char* className);
     bool IsOpen() const noexcept { return fDraft.has_value(); }
     TCimXmlDraft Take();
@@ -25,15 +25,12 @@ class TCimXmlDraftBuilder {
     /// Of the property that is open; valid until it ends.
     const std::string& GetPropertyName() const noexcept { return fProperty->fName; }
     void EndProperty(TCIMValue value);
-    void BeginMethod(const char* name, TCIMValue::TCIMType type, const TCimXmlAttributes& attributes);
+    void BeginMethod(const TCimXmlAttributes& attributes);
     void EndMethod();
-    void BeginParameter(const char* name, TCIMValue::TCIMType type, const TCimXmlAttributes& attributes);
+    void BeginParameter(const TCimXmlAttributes& attributes);
     void EndParameter();
     /// Puts it on the innermost element that is open.
     void AddQualifier(TEmbeddedObject::TQualifier qualifier);
-
-    /// The attributes OVERRIDABLE, TOSUBCLASS, TOINSTANCE and TRANSLATABLE with their defaults.
-    static ICIMQualifierDecl::EFlavor ReadFlavor(const TCimXmlAttributes& attributes);
 
   private:
     void CheckRoom(std::size_t count, std::size_t most, const char* what) const;

@@ -90,7 +90,7 @@ class TLoad {
 
     void Finish()
     {
-        fContext.Guard([this] { fLoader.Finish([this](const TCIMValue& value) { return fReader.ReadObjects(value); }); });
+        fContext.Guard([this] { fLoader.Finish([this](const TCIMValue& value) { return fReader.GetObjects().ReadAll(value); }); });
     }
 
     /// Nothing can fail from here on.

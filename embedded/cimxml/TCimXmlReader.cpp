@@ -1,3 +1,17 @@
+// From XML events to classes and instances.
+//
+// The reader keeps a stack of open elements, each with its state. When an element starts, TCimXmlTable says by the state and the
+// element which state comes next and which action to do; when it ends, the state alone says which action to do. The actions put
+// together what the elements describe:
+//
+//     object paths             TCimXmlPathReader
+//     values                   TCimXmlItem (of a property, or of a qualifier, which TCimXmlQualifierReader reads)
+//     embedded objects         TCimXmlObjectReader, which runs another reader over the value's text
+//     classes, instances       TCimXmlDraftBuilder
+//
+// What is complete goes to the loader. There is a short cut for what inventories are made of: an instance whose class is declared
+// needs no draft; the loader allocates it at once, and each property goes straight to its slot. So a property allocates no memory
+// here, and its declared type spares looking up the name of its type.
 #include "embedded/cimxml/TCimXmlReader.h"
 
 #include <algorithm>
@@ -6,30 +20,15 @@
 #include <utility>
 
 #include "embedded/cimxml/MessageText.h"
-#include "embedded/value/TValueAccess.h"
 #include "embedded/value/TValueText.h"
 
 namespace NORVZEL20 {
 
-using EStatus = TZELStatusCode::EStatusCode;
-using TType = TCIMValue::TCIMType;
-
 namespace {
 
-constexpr std::size_t kMaxEmbeddedDepth = 32;
+using EStatus = TZELStatusCode::EStatusCode;
 
-bool IsBlank(char c)
-{
-    return c == ' ' || c == '\n' || c == '\t' || c == '\r';
-}
-
-/// Whether text that may be an embedded object is one: writers that do not mark those write plain text beside them.
-bool LooksLikeObject(std::string_view text)
-{
-    const auto start = std::find_if_not(text.begin(), text.end(), IsBlank);
-    return start != text.end() && *start == '<';
-}
-
+/// Servers write the attribute in either letter case, some of them both.
 bool IsMarkedEmbedded(const TCimXmlAttributes& attributes)
 {
     return attributes.Find("EmbeddedObject") != nullptr || attributes.Find("EMBEDDEDOBJECT") != nullptr;
@@ -37,42 +36,12 @@ bool IsMarkedEmbedded(const TCimXmlAttributes& attributes)
 
 }  // namespace
 
-/// Reads the text of embedded objects; kept between them, because a parser is dear to make.
-class TCimXmlReader::TEmbedded {
-  public:
-    TEmbedded(TCimXmlContext& context, const boost::shared_ptr<TInMemNamespace>& ns)
-        : fContext(context), fSink(context, ns, nullptr), fXml(fSink)
-    {
-        // Each text within a text would have entities of its own to expand, each to the limit of a whole document.
-        fXml.RefuseDocumentTypes();
-    }
-
-    boost::shared_ptr<const TEmbeddedObject> Read(std::string_view text)
-    {
-        fSink.Reset();
-        fXml.Reset("UTF-8");
-        if (!fXml.Parse(text.data(), text.size(), true)) {
-            fContext.Fail(EStatus::kTypeMismatch,
-                          "found " + Quote(text) + ", expected an <INSTANCE> or a <CLASS> (" + fXml.GetError() + ")");
-        }
-        return fSink.TakeObject();
-    }
-
-    bool TakeMetUnknownClass() noexcept { return fSink.fPaths.TakeMetUnknownClass(); }
-
-  private:
-    TCimXmlContext& fContext;
-    TCimXmlReader fSink;
-    TXmlReader fXml;
-};
-
-TCimXmlReader::TCimXmlReader(TCimXmlContext& context, boost::shared_ptr<TInMemNamespace> ns, TCimXmlLoader* loader)
-    : fContext(context), fNamespace(ns), fLoader(loader), fPaths(context, std::move(ns)), fDraft(context)
+TCimXmlReader::TCimXmlReader(TCimXmlContext& context, const boost::shared_ptr<TInMemNamespace>& ns, TCimXmlLoader* loader)
+    : fContext(context), fLoader(loader), fPaths(context, ns), fObjects(context, ns, fPaths), fDraft(context),
+      fProperty(context, fObjects), fQualifier(context, fObjects)
 {
     Reset();
 }
-
-TCimXmlReader::~TCimXmlReader() = default;
 
 void TCimXmlReader::Reset()
 {
@@ -81,7 +50,7 @@ void TCimXmlReader::Reset()
     fObject.reset();
 }
 
-boost::shared_ptr<const TEmbeddedObject> TCimXmlReader::TakeObject()
+boost::shared_ptr<const TEmbeddedObject> TCimXmlReader::TakeObject() noexcept
 {
     return std::exchange(fObject, boost::shared_ptr<const TEmbeddedObject>());
 }
@@ -96,7 +65,7 @@ void TCimXmlReader::OnStart(const char* name, const char** attributes)
     }
     fOpen.push_back({step.next, element});
     fText = std::string_view();
-    fContext.Guard([&] { Begin(step.action, TCimXmlAttributes(attributes)); });
+    fContext.Guard([&] { Begin(step.action, TCimXmlAttributes(fContext, element, attributes)); });
 }
 
 void TCimXmlReader::OnEnd(const char*)
@@ -114,12 +83,13 @@ void TCimXmlReader::CheckBlank() const
     if (fText.empty() || TTable::TakesText(GetState())) {
         return;
     }
-    if (!std::all_of(fText.begin(), fText.end(), IsBlank)) {
+    if (!std::all_of(fText.begin(), fText.end(), TXmlReader::IsBlank)) {
         fContext.Fail(EStatus::kParseError, "found text " + Quote(fText) + " in <" + TElement::GetName(fOpen.back().element) +
                                                 ">, expected elements alone");
     }
 }
 
+/// The actions that instances consist of; the others are in BeginRare.
 void TCimXmlReader::Begin(TTable::EAction action, const TCimXmlAttributes& attributes)
 {
     switch (action) {
@@ -128,9 +98,9 @@ void TCimXmlReader::Begin(TTable::EAction action, const TCimXmlAttributes& attri
     case TTable::kBeginText:
         return BeginValue();
     case TTable::kBeginArray:
-        return BeginArray();
+        return fItem->BeginArray(GetState() == TTable::kReferenceArray);
     case TTable::kAddNull:
-        return fElements.push_back(TCIMValue::Null(fItem->type.GetElementType()));
+        return fItem->AddNull();
     case TTable::kBeginInstance:
         return BeginInstance(attributes);
     case TTable::kBeginObject:
@@ -138,17 +108,43 @@ void TCimXmlReader::Begin(TTable::EAction action, const TCimXmlAttributes& attri
     case TTable::kBeginReference:
         return fPaths.Begin();
     case TTable::kReadClassName:
-        return fPaths.SetClassName(Require(attributes, fOpen.back().element == TElement::kClassName ? "NAME" : "CLASSNAME"));
+        return fPaths.SetClassName(attributes.Require(attributes.GetElement() == TElement::kClassName ? "NAME" : "CLASSNAME"));
     case TTable::kBeginKeyBinding:
-        return fPaths.BeginKeyBinding(Require(attributes, "NAME"));
+        return fPaths.BeginKeyBinding(attributes.Require("NAME"));
     case TTable::kBeginKeyValue:
         return fPaths.BeginKeyValue(attributes);
     case TTable::kBeginNamespacePath:
         return fPaths.BeginNamespacePath();
     case TTable::kReadNamespace:
-        return fPaths.AddNamespace(Require(attributes, "NAME"));
+        return fPaths.AddNamespace(attributes.Require("NAME"));
     default:
-        return BeginDeclared(action, attributes);
+        return BeginRare(action, attributes);
+    }
+}
+
+void TCimXmlReader::BeginRare(TTable::EAction action, const TCimXmlAttributes& attributes)
+{
+    switch (action) {
+    case TTable::kBeginClass:
+        return BeginClass(attributes);
+    case TTable::kBeginMethod:
+        return fDraft.BeginMethod(attributes);
+    case TTable::kBeginParameter:
+        return fDraft.BeginParameter(attributes);
+    case TTable::kBeginQualifier:
+        fItem = &fQualifier.GetItem();
+        return fQualifier.Begin(attributes);
+    case TTable::kBeginQualifierDecl:
+        fItem = &fQualifier.GetItem();
+        return fQualifier.BeginDecl(attributes);
+    case TTable::kReadScope:
+        return fQualifier.ReadScope(attributes);
+    case TTable::kReadError:
+        return ReadError(attributes);
+    case TTable::kSkip:
+        return NoteSkipped(attributes);
+    default:
+        return;
     }
 }
 
@@ -160,7 +156,7 @@ void TCimXmlReader::End(TTable::EAction action)
     case TTable::kEndProperty:
         return EndProperty();
     case TTable::kEndArray:
-        return EndArray();
+        return fItem->EndArray();
     case TTable::kEndInstance:
         return EndInstance();
     case TTable::kEndObject:
@@ -174,48 +170,82 @@ void TCimXmlReader::End(TTable::EAction action)
     case TTable::kEndHost:
         return fPaths.SetHost(fText);
     case TTable::kEndNamespacePath:
-        if (GetState() != TTable::kNamespacePath) {  // there it ends with the host's part
+        if (GetState() != TTable::kNamespacePath) {  // a LOCALNAMESPACEPATH in a NAMESPACEPATH is only its second part
             fPaths.EndNamespacePath();
         }
         return;
     default:
-        return EndDeclared(action);
+        return EndRare(action);
+    }
+}
+
+void TCimXmlReader::EndRare(TTable::EAction action)
+{
+    switch (action) {
+    case TTable::kEndClass:
+        return EndClass();
+    case TTable::kEndMethod:
+        return fDraft.EndMethod();
+    case TTable::kEndParameter:
+        return fDraft.EndParameter();
+    case TTable::kEndQualifier:
+        return EndQualifier();
+    case TTable::kEndQualifierDecl:
+        return fLoader->AddQualifierDecl(fQualifier.TakeDecl());
+    default:
+        return;
     }
 }
 
 void TCimXmlReader::BeginObject()
 {
-    fObjectGiven = false;
+    fIsObjectGiven = false;
     fPaths.Begin();
 }
 
 void TCimXmlReader::EndObject()
 {
-    if (!fObjectGiven) {
+    if (!fIsObjectGiven) {
         fContext.Fail(EStatus::kParseError, "found an object without contents, expected a <CLASS> or an <INSTANCE> in it");
     }
     fPaths.Drop();
 }
 
-/// To be called where a class or an instance starts: an object holds one, and its name tells the namespace.
+/// To be called when a class or an instance starts: a VALUE.OBJECT holds one, and the name in front of it gives the namespace.
 void TCimXmlReader::NoteObject()
 {
-    if (fOpen[fOpen.size() - 2].state != TTable::kObject) {
+    if (GetOuterState() != TTable::kObject) {
         return;
     }
-    if (fObjectGiven) {
+    if (fIsObjectGiven) {
         fContext.Fail(EStatus::kParseError, "found a second object where one is expected");
     }
-    fObjectGiven = true;
+    fIsObjectGiven = true;
     fPaths.NoteOwnNamespace();
+}
+
+void TCimXmlReader::BeginClass(const TCimXmlAttributes& attributes)
+{
+    NoteObject();
+    fDraft.BeginClass(attributes);
+}
+
+void TCimXmlReader::EndClass()
+{
+    TCimXmlDraft draft = fDraft.Take();
+    if (KeepObject(draft)) {
+        return;
+    }
+    const TCimXmlContext::TAt at(fContext, draft.place);
+    fLoader->AddClass(std::move(draft));
 }
 
 void TCimXmlReader::BeginInstance(const TCimXmlAttributes& attributes)
 {
     NoteObject();
-    const char* name = Require(attributes, "CLASSNAME");
-    fDirect = fLoader != nullptr && fLoader->BeginInstance(name);
-    if (!fDirect) {
+    const char* name = attributes.Require("CLASSNAME");
+    fIsDirect = fLoader != nullptr && fLoader->BeginInstance(name);
+    if (!fIsDirect) {
         fDraft.BeginInstance(name);
     }
 }
@@ -223,14 +253,13 @@ void TCimXmlReader::BeginInstance(const TCimXmlAttributes& attributes)
 void TCimXmlReader::EndInstance()
 {
     const bool isNamed = fLoader != nullptr && fPaths.HasOwnPath();
-    if (fDirect) {
-        fDirect = false;
+    if (fIsDirect) {
+        fIsDirect = false;
         // Only a loader starts an instance directly, so there is one.
         return fLoader->EndInstance(isNamed ? &fPaths.GetOwnKeys() : nullptr);  // NOLINT(clang-analyzer-core.CallAndMessage)
     }
     TCimXmlDraft draft = fDraft.Take();
-    if (fLoader == nullptr) {
-        fObject = boost::make_shared<const TEmbeddedObject>(std::move(draft.object));
+    if (KeepObject(draft)) {
         return;
     }
     if (isNamed) {
@@ -239,90 +268,87 @@ void TCimXmlReader::EndInstance()
     fLoader->AddInstance(std::move(draft));
 }
 
-void TCimXmlReader::BeginItem(TItem& item, std::string_view name, TType type)
+/// Without a loader, the draft is the embedded object that was asked for; returns false if there is a loader to take it.
+bool TCimXmlReader::KeepObject(TCimXmlDraft& draft)
 {
-    item.name = name;
-    item.type = type;
-    item.text = TItem::kPlain;
-    item.isGiven = false;
-    fItem = &item;
+    if (fLoader != nullptr) {
+        return false;
+    }
+    fObject = boost::make_shared<const TEmbeddedObject>(std::move(draft.object));
+    return true;
 }
 
 void TCimXmlReader::BeginProperty(const TCimXmlAttributes& attributes)
 {
-    const char* name = Require(attributes, "NAME");
-    if (fDirect) {
+    const char* name = attributes.Require("NAME");
+    if (fIsDirect) {
         fTarget = fLoader->FindProperty(name);
     } else {
         fDraft.BeginProperty(name, attributes);
     }
-    BeginItem(fProperty, fDirect ? *fTarget.name : fDraft.GetPropertyName(), ReadPropertyType(attributes));
-    if (fProperty.type.GetElementType() != TType::kString) {
-        return;
+    const TType type = ReadPropertyType(attributes);
+    TCimXmlItem::EText text = TCimXmlItem::kPlain;
+    if (type.GetElementType() == TType::kString) {
+        if (IsMarkedEmbedded(attributes)) {
+            text = TCimXmlItem::kObject;
+        } else if (fIsDirect && fTarget.isEmbedded) {
+            text = TCimXmlItem::kPerhapsObject;
+        }
     }
-    if (IsMarkedEmbedded(attributes)) {
-        fProperty.text = TItem::kObject;
-    } else if (fDirect && fTarget.isEmbedded) {
-        fProperty.text = TItem::kPerhapsObject;
-    }
+    fProperty.Begin(fIsDirect ? *fTarget.name : fDraft.GetPropertyName(), type, text);
+    fItem = &fProperty;
 }
 
-/// The type that the element tells; looked up only where it is not the declared one.
-TType TCimXmlReader::ReadPropertyType(const TCimXmlAttributes& attributes) const
+/// The type that the element gives. If that is the declared one, as it mostly is, its name need not be looked up.
+TCIMValue::TCIMType TCimXmlReader::ReadPropertyType(const TCimXmlAttributes& attributes) const
 {
-    const TElement::EElement element = fOpen.back().element;
+    const TElement::EElement element = attributes.GetElement();
     if (element == TElement::kPropertyReference) {
         return TType::kReference;
     }
     if (element == TElement::kPropertyRefArray) {
         return TType::kArrayReference;
     }
-    const char* text = Require(attributes, "TYPE");
-    const bool isDeclared = fDirect && std::strcmp(text, TValueText::GetTypeName(fTarget.type)) == 0;
-    const TType type = isDeclared ? fTarget.type.GetElementType() : ReadType(text);
+    const char* text = attributes.Require("TYPE");
+    const bool isDeclared = fIsDirect && std::strcmp(text, TValueText::GetTypeName(fTarget.type)) == 0;
+    const TType type = isDeclared ? fTarget.type.GetElementType() : attributes.ReadType(text);
     return element == TElement::kPropertyArray ? type.GetArrayType() : type;
 }
 
 void TCimXmlReader::EndProperty()
 {
-    if (!fDirect) {
-        return fDraft.EndProperty(TakeValue(fProperty));
+    if (!fIsDirect) {
+        return fDraft.EndProperty(fProperty.Take());
     }
-    if (!fProperty.value.IsNull()) {
-        fLoader->SetProperty(fTarget, std::move(fProperty.value), fPaths.TakeMetUnknownClass());
+    if (!fProperty.IsNull()) {
+        fLoader->SetProperty(fTarget, fProperty.Take(), fPaths.TakeMetUnknownClass());
     }
-    fProperty.value = TCIMValue();
+}
+
+void TCimXmlReader::EndQualifier()
+{
+    TEmbeddedObject::TQualifier qualifier = fQualifier.Take();
+    fItem = &fProperty;
+    if (fIsDirect) {
+        return fContext.Tolerate("qualifier of an instance",
+                                 "qualifier " + Quote(qualifier.fName) + " stands on an instance or its property; left out");
+    }
+    fDraft.AddQualifier(std::move(qualifier));
 }
 
 void TCimXmlReader::BeginValue()
 {
-    if (fOpen[fOpen.size() - 2].state == TTable::kArray) {
-        return;
-    }
-    if (fItem->isGiven) {
-        fContext.Fail(EStatus::kParseError, "found a second value for " + Quote(fItem->name) + ", expected one");
-    }
-    fItem->isGiven = true;
-}
-
-void TCimXmlReader::BeginArray()
-{
-    BeginValue();
-    fElements.clear();
-    if (GetState() == TTable::kReferenceArray && fItem->type.GetElementType() != TType::kReference) {
-        fContext.Fail(EStatus::kTypeMismatch, "found an array of references as value of " + Quote(fItem->name) + ", expected a " +
-                                                  TValueText::DescribeType(fItem->type.GetArrayType()));
+    if (GetOuterState() != TTable::kArray) {
+        fItem->BeginValue();
     }
 }
 
-/// What a value belongs to is the innermost element that is open when it has ended.
 void TCimXmlReader::EndText()
 {
-    if (GetState() != TTable::kArray) {
-        return MakeValue(fText, fItem->value);
+    if (GetState() == TTable::kArray) {
+        return fItem->AddText(fText);
     }
-    fElements.emplace_back();
-    MakeValue(fText, fElements.back());
+    fItem->SetText(fText);
 }
 
 void TCimXmlReader::EndReference()
@@ -330,78 +356,35 @@ void TCimXmlReader::EndReference()
     TCIMValue path(fPaths.End());
     switch (GetState()) {
     case TTable::kReferenceArray:
-        return fElements.push_back(std::move(path));
+        return fItem->AddReference(std::move(path));
     case TTable::kKeyBinding:
     case TTable::kInstanceName:
         return fPaths.AddKey(std::move(path));
     default:
-        fItem->value = std::move(path);
+        fItem->SetReference(std::move(path));
     }
 }
 
-void TCimXmlReader::EndArray()
+void TCimXmlReader::ReadError(const TCimXmlAttributes& attributes) const
 {
-    fItem->type = fItem->type.GetArrayType();
-    fItem->value = TCIMValue(fItem->type, static_cast<unsigned int>(fElements.size()), fElements);
-    fElements.clear();
+    fContext.Fail(EStatus::kParseError, std::string("found a response with error ") + attributes.Get("CODE") + " (" +
+                                            Quote(attributes.Get("DESCRIPTION")) + "), expected one with objects");
 }
 
-TCIMValue TCimXmlReader::TakeValue(TItem& item)
+void TCimXmlReader::NoteSkipped(const TCimXmlAttributes& attributes)
 {
-    TCIMValue value = item.value.IsNull() ? TCIMValue::Null(item.type) : std::move(item.value);
-    item.value = TCIMValue();
-    return value;
+    const char* name = TElement::GetName(attributes.GetElement());
+    fContext.Tolerate(name, std::string("<") + name + "> holds no class or instance; left out");
 }
 
-void TCimXmlReader::MakeValue(std::string_view text, TCIMValue& value)
+void TCimXmlReader::FailUnexpected(const char* name) const
 {
-    const TType type = fItem->type.GetElementType();
-    if (type == TType::kString) {
-        value = IsObject(text) ? MakeObject(text) : fContext.GetTexts().MakeValue(text);
-    } else if (!TValueText::Parse(type, text, value)) {
-        fContext.Fail(EStatus::kTypeMismatch, "found " + Quote(text) + " as value of " + Quote(fItem->name) + ", expected a " +
-                                                  TValueText::GetTypeName(type));
-    }
-}
-
-bool TCimXmlReader::IsObject(std::string_view text) const
-{
-    if (fItem->text == TItem::kPerhapsObject) {
-        return LooksLikeObject(text);
-    }
-    return fItem->text == TItem::kObject && !text.empty();
-}
-
-TCIMValue TCimXmlReader::ReadObjects(const TCIMValue& value)
-{
-    if (value.IsNull()) {
-        return value;
-    }
-    if (value.GetType().IsArray()) {
-        std::vector<TCIMValue> elements;
-        for (const TCIMValue& element : value.GetElements()) {
-            elements.push_back(ReadObjects(element));
-        }
-        return TCIMValue(value.GetType(), static_cast<unsigned int>(elements.size()), elements);
-    }
-    return TValueAccess::IsText(value) && LooksLikeObject(value.GetString()) ? MakeObject(value.GetString()) : value;
-}
-
-TCIMValue TCimXmlReader::MakeObject(std::string_view text)
-{
-    if (fContext.fEmbeddedDepth == kMaxEmbeddedDepth) {
-        fContext.Fail(EStatus::kParseError, "embedded objects are nested too deeply");
-    }
-    if (!fEmbedded) {
-        fEmbedded = std::make_unique<TEmbedded>(fContext, fNamespace);
-    }
-    ++fContext.fEmbeddedDepth;
-    TCIMValue value(fEmbedded->Read(text));
-    --fContext.fEmbeddedDepth;
-    if (fEmbedded->TakeMetUnknownClass()) {
-        fPaths.NoteUnknownClass();
-    }
-    return value;
+    const TOpen& open = fOpen.back();
+    const std::string place = open.element == TElement::kUnknown ? " as the outermost element"
+                                                                 : std::string(" in <") + TElement::GetName(open.element) + ">";
+    const std::string shown = Quote(name);
+    fContext.Fail(EStatus::kParseError, "found element <" + shown.substr(1, shown.size() - 2) + ">" + place + ", expected " +
+                                            TTable::DescribeExpected(open.state));
 }
 
 }  // namespace NORVZEL20

@@ -41,6 +41,9 @@ class TXmlReader {
         virtual void OnNotation(const char*, const char*, const char*) {}
     };
 
+    /// Whether XML counts the character as white space.
+    static bool IsBlank(char c) noexcept { return c == ' ' || c == '\n' || c == '\t' || c == '\r'; }
+
     /// The sink must outlive the reader. Errors: std::bad_alloc.
     explicit TXmlReader(ISink& sink);
     TXmlReader(const TXmlReader&) = delete;

@@ -1,0 +1,80 @@
+#pragma once
+
+#include <string_view>
+#include <utility>
+#include <vector>
+
+#include "embedded/cimxml/TCimXmlContext.h"
+#include "host/TCIMValue.h"
+
+namespace NORVZEL20 {
+
+class TCimXmlObjectReader;
+
+/// A property, a qualifier or a qualifier's declaration while its value is read. One item serves many elements in turn.
+///
+/// Order of calls: Begin; for a simple value BeginValue and then SetText or SetReference; for an array BeginArray, any number of
+/// AddText, AddReference and AddNull, EndArray; at last Take. Without a value, Take returns a typed null.
+/// Errors: fail through the context with the status that each operation names; the load then ends.
+class TCimXmlItem {
+  public:
+    using TType = TCIMValue::TCIMType;
+
+    /// What the text of a string value may be.
+    enum EText : unsigned char {
+        kPlain,         ///< text alone
+        kObject,        ///< an embedded object, because the document marks the element so; empty text stays text
+        kPerhapsObject  ///< an embedded object if it looks like one: the class declares so, but the document does not mark it
+    };
+
+    /// Both arguments must outlive the item.
+    TCimXmlItem(TCimXmlContext& context, TCimXmlObjectReader& objects) noexcept : fContext(context), fObjects(objects) {}
+
+    /// Starts the item. `name` is for messages and must stay valid until Take. `type` is an array type if the element says so.
+    void Begin(std::string_view name, TType type, EText text) noexcept
+    {
+        fName = name;
+        fType = type;
+        fText = text;
+        fIsGiven = false;
+    }
+
+    /// Starts a value. Errors: kParseError (9) if the item has one.
+    void BeginValue()
+    {
+        if (std::exchange(fIsGiven, true)) {
+            FailSecond();
+        }
+    }
+    /// Reads a simple value. Errors: kTypeMismatch (13) if the text is no value of the item's type.
+    void SetText(std::string_view text) { Parse(text, fValue); }
+    void SetReference(TCIMValue path) noexcept { fValue = std::move(path); }
+
+    /// Starts an array. Errors: as BeginValue; kTypeMismatch (13) for references in an item of another type.
+    void BeginArray(bool isOfReferences);
+    /// Errors: as SetText.
+    void AddText(std::string_view text) { Parse(text, fElements.emplace_back()); }
+    void AddReference(TCIMValue path) { fElements.push_back(std::move(path)); }
+    void AddNull() { fElements.push_back(TCIMValue::Null(fType.GetElementType())); }
+    void EndArray();
+
+    bool IsNull() const noexcept { return fValue.IsNull(); }
+    /// The value, or a null of the item's type.
+    TCIMValue Take();
+
+  private:
+    void Parse(std::string_view text, TCIMValue& value);
+    bool IsObject(std::string_view text) const;
+    [[noreturn]] void FailSecond() const;
+
+    TCimXmlContext& fContext;
+    TCimXmlObjectReader& fObjects;
+    std::string_view fName;
+    TType fType = TType::kNone;
+    EText fText = kPlain;
+    bool fIsGiven = false;
+    TCIMValue fValue;
+    std::vector<TCIMValue> fElements;  // of the array that is open; kept for its memory
+};
+
+}  // namespace NORVZEL20

@@ -1,0 +1,92 @@
+// Embedded objects.
+//
+// The value of a string property may be the text of an <INSTANCE> or a <CLASS>, escaped as text:
+//
+//     <VALUE>&lt;INSTANCE CLASSNAME="Disk"&gt;...&lt;/INSTANCE&gt;</VALUE>
+//
+// Such text is a document of its own: it is parsed by another TXmlReader into another TCimXmlReader, one that has no loader and so
+// keeps the object. Objects within that object are read by the object reader of that reader, and so on, down to a fixed depth.
+// Each text could declare entities and expand them up to the limit of a whole document, so a document type is refused here.
+#include "embedded/cimxml/TCimXmlObjectReader.h"
+
+#include <algorithm>
+#include <utility>
+#include <vector>
+
+#include "embedded/cimxml/MessageText.h"
+#include "embedded/cimxml/TCimXmlReader.h"
+#include "embedded/cimxml/TXmlReader.h"
+#include "embedded/value/TValueAccess.h"
+
+namespace NORVZEL20 {
+
+/// The readers for one level of nesting.
+class TCimXmlObjectReader::TNested {
+  public:
+    TNested(TCimXmlContext& context, const boost::shared_ptr<TInMemNamespace>& ns)
+        : fContext(context), fReader(context, ns, nullptr), fXml(fReader)
+    {
+        fXml.RefuseDocumentTypes();
+    }
+
+    boost::shared_ptr<const TEmbeddedObject> Read(std::string_view text)
+    {
+        fReader.Reset();
+        fXml.Reset("UTF-8");
+        if (!fXml.Parse(text.data(), text.size(), true)) {
+            fContext.Fail(TZELStatusCode::kTypeMismatch,
+                          "found " + Quote(text) + ", expected an <INSTANCE> or a <CLASS> (" + fXml.GetError() + ")");
+        }
+        return fReader.TakeObject();
+    }
+
+    bool TakeMetUnknownClass() noexcept { return fReader.TakeMetUnknownClass(); }
+
+  private:
+    TCimXmlContext& fContext;
+    TCimXmlReader fReader;
+    TXmlReader fXml;
+};
+
+TCimXmlObjectReader::TCimXmlObjectReader(TCimXmlContext& context, boost::shared_ptr<TInMemNamespace> ns, TCimXmlPathReader& paths)
+    : fContext(context), fNamespace(std::move(ns)), fPaths(paths)
+{}
+
+TCimXmlObjectReader::~TCimXmlObjectReader() = default;
+
+bool TCimXmlObjectReader::LooksLikeObject(std::string_view text)
+{
+    const auto start = std::find_if_not(text.begin(), text.end(), TXmlReader::IsBlank);
+    return start != text.end() && *start == '<';
+}
+
+TCIMValue TCimXmlObjectReader::Read(std::string_view text)
+{
+    fContext.EnterEmbeddedObject();
+    if (!fNested) {
+        fNested = std::make_unique<TNested>(fContext, fNamespace);
+    }
+    TCIMValue value(fNested->Read(text));
+    fContext.LeaveEmbeddedObject();
+    if (fNested->TakeMetUnknownClass()) {
+        fPaths.NoteUnknownClass();
+    }
+    return value;
+}
+
+TCIMValue TCimXmlObjectReader::ReadAll(const TCIMValue& value)
+{
+    if (value.IsNull()) {
+        return value;
+    }
+    if (value.GetType().IsArray()) {
+        std::vector<TCIMValue> elements;
+        for (const TCIMValue& element : value.GetElements()) {
+            elements.push_back(ReadAll(element));
+        }
+        return TCIMValue(value.GetType(), static_cast<unsigned int>(elements.size()), elements);
+    }
+    return TValueAccess::IsText(value) && LooksLikeObject(value.GetString()) ? Read(value.GetString()) : value;
+}
+
+}  // namespace NORVZEL20

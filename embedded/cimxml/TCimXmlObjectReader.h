@@ -1,0 +1,44 @@
+#pragma once
+
+#include <boost/smart_ptr/shared_ptr.hpp>
+#include <memory>
+#include <string_view>
+
+#include "embedded/cimxml/TCimXmlContext.h"
+#include "embedded/cimxml/TCimXmlPathReader.h"
+#include "embedded/store/TInMemNamespace.h"
+#include "host/TCIMValue.h"
+
+namespace NORVZEL20 {
+
+/// Reads embedded objects: texts of values that are themselves an INSTANCE or a CLASS, which may hold further such texts.
+///
+/// Errors: every operation fails through the context: kTypeMismatch (13) if the text is no embedded object or has a document type
+/// declaration, kParseError (9) if objects are nested too deeply or what they hold is wrong.
+class TCimXmlObjectReader {
+  public:
+    /// `ns` (may be null) is where the classes of references are looked up. `paths` is notified of references to classes that are
+    /// not declared yet. `context` and `paths` must outlive the reader.
+    TCimXmlObjectReader(TCimXmlContext& context, boost::shared_ptr<TInMemNamespace> ns, TCimXmlPathReader& paths);
+    TCimXmlObjectReader(const TCimXmlObjectReader&) = delete;
+    TCimXmlObjectReader& operator=(const TCimXmlObjectReader&) = delete;
+    ~TCimXmlObjectReader();
+
+    /// Whether text may be an embedded object: writers that do not mark objects also write plain text into the same property.
+    static bool LooksLikeObject(std::string_view text);
+
+    /// The embedded object that the text describes.
+    TCIMValue Read(std::string_view text);
+    /// The value, or for an array each of its elements, with text that looks like an object replaced by that object.
+    TCIMValue ReadAll(const TCIMValue& value);
+
+  private:
+    class TNested;
+
+    TCimXmlContext& fContext;
+    boost::shared_ptr<TInMemNamespace> fNamespace;
+    TCimXmlPathReader& fPaths;
+    std::unique_ptr<TNested> fNested;  // made for the first object and kept, because an XML parser is expensive to make
+};
+
+}  // namespace NORVZEL20
