@@ -14,4 +14,9 @@ std::string Quote(std::string_view text)
     return quoted + (text.size() > kLongest ? "...\"" : "\"");
 }
 
+std::string DescribeSecondProperty(std::string_view property, const char* object)
+{
+    return "found property " + Quote(property) + " a second time in one " + object;
+}
+
 }  // namespace NORVZEL20

@@ -9,4 +9,10 @@ namespace NORVZEL20 {
 /// dots.
 std::string Quote(std::string_view text);
 
+/// That an object (a "class" or an "instance") has a property twice.
+std::string DescribeSecondProperty(std::string_view property, const char* object);
+
+/// What follows the name of a class that is needed but not declared.
+inline constexpr char kIsNotDeclared[] = ", which is not declared; add its <CLASS> to the document or load it before";
+
 }  // namespace NORVZEL20

@@ -43,8 +43,7 @@ void TCimXmlDraftBuilder::BeginProperty(const char* name, const TCimXmlAttribute
 {
     CheckRoom(fDraft->object.GetProperties().size(), TSchemaLimits::kMaxProperties, "properties");
     if (fDraft->object.FindProperty(name) != nullptr) {
-        fContext.Fail(EStatus::kParseError, "found property " + Quote(name) + " a second time in one " +
-                                                (fDraft->object.IsClass() ? "class" : "instance"));
+        fContext.Fail(EStatus::kParseError, DescribeSecondProperty(name, fDraft->object.IsClass() ? "class" : "instance"));
     }
     fPropertyPlace = fContext.GetPlace();
     fProperty.emplace();

@@ -75,7 +75,7 @@ const TRow kRows[] = {
     {"value twice", L::Group(L::Class("A", "<PROPERTY NAME=\"N\" TYPE=\"uint8\"><VALUE>1</VALUE><VALUE>2</VALUE></PROPERTY>")), 9,
      "doc.xml:2:212: found a second value for \"N\", expected one"},
     {"class twice, differing", L::Group(L::Class("A") + ClassWithCounter()), 12,
-     "doc.xml:3:15: found a second, different declaration of class \"A\"; remove one"},
+     "doc.xml:3:15: found class \"A\" a second time, declared differently; remove one of the two"},
     {"recorded error", "<CIM><MESSAGE><SIMPLERSP><IMETHODRESPONSE><ERROR CODE=\"6\" DESCRIPTION=\"gone\"/>", 9,
      "doc.xml:1:43: found a response with error 6 (\"gone\"), expected one with objects"},
     {"two namespaces",

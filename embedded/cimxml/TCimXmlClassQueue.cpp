@@ -1,0 +1,162 @@
+// Declaring classes that come in any order.
+//
+// A class can be declared only after its superclass, but documents may list them the other way round. So a class is queued (new)
+// when it is read. When an instance needs a class, or the document ends, the new ones are tried in the document's order: from a
+// class upwards through the queue until a superclass is declared (or the class has none), then downwards, declaring each. If the
+// chain ends at a superclass that nobody knows yet, all of it is stuck.
+//
+// Stuck classes are not tried again for every instance, which would take time in proportion to classes times instances. They
+// become new again only when an instance needs that very class, and when the document ends.
+#include "embedded/cimxml/TCimXmlClassQueue.h"
+
+#include <utility>
+
+#include "embedded/cimxml/MessageText.h"
+#include "embedded/cimxml/TCimXmlClassMaker.h"
+#include "embedded/cimxml/TCimXmlObjects.h"
+
+namespace NORVZEL20 {
+
+using EStatus = TZELStatusCode::EStatusCode;
+
+void TCimXmlClassQueue::Add(TCimXmlDraft draft)
+{
+    static constexpr TRepetition kInDocument{"repeated class", " is declared again; the first declaration stands",
+                                             " a second time, declared differently; remove one of the two"};
+    static constexpr TRepetition kInNamespace{"known class", " is in the namespace already, declared the same",
+                                              ", which the namespace declares differently; load into an empty one"};
+    const std::string& name = draft.object.GetClassName();
+    const auto repeated = fNumbers.find(name);
+    if (repeated != fNumbers.end()) {
+        return NoteRepeated(name, fEntries[repeated->second].draft.object == draft.object, kInDocument);
+    }
+    if (const boost::shared_ptr<TInMemClass> known = fNamespace.FindClass(name)) {
+        const bool isSame = TCimXmlObjects::FromClass(*known) == TCimXmlObjects::WithoutInherited(draft.object);
+        return NoteRepeated(name, isSame, kInNamespace);
+    }
+    fNumbers.emplace(name, fEntries.size());
+    fEntries.push_back({std::move(draft), kNew});
+    ++fContext.GetReport().classes;
+}
+
+void TCimXmlClassQueue::NoteRepeated(const std::string& name, bool isSame, const TRepetition& repetition)
+{
+    const std::string shown = "class " + Quote(name);
+    if (!isSame) {
+        fContext.Fail(EStatus::kAlreadyExists, "found " + shown + repetition.conflict);
+    }
+    fContext.Tolerate(repetition.kind, shown + repetition.tolerated);
+}
+
+boost::shared_ptr<TInMemClass> TCimXmlClassQueue::Find(const char* name)
+{
+    boost::shared_ptr<TInMemClass> cls = fNamespace.FindClass(name);
+    if (!cls) {
+        DeclareNew();
+        DeclareStuck(name);
+        cls = fNamespace.FindClass(name);
+    }
+    return cls;
+}
+
+void TCimXmlClassQueue::DeclareNew()
+{
+    for (; fFirstNew < fEntries.size(); ++fFirstNew) {
+        Declare(fFirstNew);
+    }
+}
+
+/// Tries a class again, whose superclass may have come meanwhile.
+void TCimXmlClassQueue::DeclareStuck(const char* name)
+{
+    const auto known = fNumbers.find(name);
+    if (known == fNumbers.end()) {
+        return;
+    }
+    for (std::size_t next = known->second; fEntries[next].state == kStuck;) {
+        fEntries[next].state = kNew;
+        const auto super = fNumbers.find(fEntries[next].draft.object.GetSuperClassName());
+        if (super != fNumbers.end()) {
+            next = super->second;
+        }
+    }
+    Declare(known->second);
+}
+
+/// The class and those of its superclasses that are new, upwards; `super` is what is declared above them.
+std::vector<std::size_t> TCimXmlClassQueue::CollectChain(std::size_t number, boost::shared_ptr<TInMemClass>& super)
+{
+    std::vector<std::size_t> chain;
+    for (std::size_t next = number; fEntries[next].state == kNew;) {
+        ++fTried;
+        fEntries[next].state = kVisited;
+        chain.push_back(next);
+        const std::string& superName = fEntries[next].draft.object.GetSuperClassName();
+        super = fNamespace.FindClass(superName);
+        const auto waiting = fNumbers.find(superName);
+        if (superName.empty() || super || waiting == fNumbers.end()) {
+            break;
+        }
+        next = waiting->second;
+    }
+    return chain;
+}
+
+/// Declares a class after those of its superclasses that wait, or none of them if the topmost is not known yet.
+void TCimXmlClassQueue::Declare(std::size_t number)
+{
+    ++fTried;
+    boost::shared_ptr<TInMemClass> super;
+    for (std::vector<std::size_t> chain = CollectChain(number, super); !chain.empty(); chain.pop_back()) {
+        TEntry& entry = fEntries[chain.back()];
+        entry.state = kStuck;
+        if (!super && !entry.draft.object.GetSuperClassName().empty()) {
+            continue;
+        }
+        const TCimXmlContext::TAt at(fContext, entry.draft.place);
+        fContext.Guard([&] {
+            super = TCimXmlClassMaker(fContext, fNamespace).Make(entry.draft, super);
+            fStaging.AddClass(super);
+        });
+        entry.state = kDeclared;
+        ++fDeclared;
+    }
+}
+
+void TCimXmlClassQueue::DeclareAll()
+{
+    for (TEntry& entry : fEntries) {
+        if (entry.state == kStuck) {
+            entry.state = kNew;
+        }
+    }
+    fFirstNew = 0;
+    DeclareNew();
+    for (const TEntry& entry : fEntries) {
+        if (entry.state != kDeclared) {
+            Refuse(entry.draft);
+        }
+    }
+}
+
+void TCimXmlClassQueue::Refuse(const TCimXmlDraft& draft) const
+{
+    const TCimXmlContext::TAt at(fContext, draft.place);
+    const std::string& superName = draft.object.GetSuperClassName();
+    const std::string found = "found class " + Quote(draft.object.GetClassName()) + " with the superclass " + Quote(superName);
+    if (fNumbers.count(superName) > 0) {
+        fContext.Fail(EStatus::kNotFound, found + ", which in the end is below it or below an undeclared class");
+    }
+    fContext.Fail(EStatus::kNotFound, found + kIsNotDeclared);
+}
+
+std::vector<boost::shared_ptr<ICIMElement>> TCimXmlClassQueue::GetClasses() const
+{
+    std::vector<boost::shared_ptr<ICIMElement>> classes;
+    for (const TEntry& entry : fEntries) {
+        classes.push_back(fNamespace.FindClass(entry.draft.object.GetClassName()));
+    }
+    return classes;
+}
+
+}  // namespace NORVZEL20

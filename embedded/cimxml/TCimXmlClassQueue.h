@@ -1,0 +1,83 @@
+#pragma once
+
+#include <boost/smart_ptr/shared_ptr.hpp>
+#include <cstddef>
+#include <vector>
+
+#include "embedded/cimxml/TCimXmlContext.h"
+#include "embedded/cimxml/TCimXmlDraft.h"
+#include "embedded/store/TInMemNamespace.h"
+#include "embedded/store/TInMemStaging.h"
+#include "embedded/value/TNameText.h"
+#include "host/ICIMElement.h"
+
+namespace NORVZEL20 {
+
+/// The classes that a document declares. They may come in any order: each waits until it is needed or the document ends.
+///
+/// Errors: every operation but the counts fails through the context, at the place of the class concerned.
+class TCimXmlClassQueue {
+  public:
+    /// All arguments must outlive the queue. `staging` is one of `ns`.
+    TCimXmlClassQueue(TCimXmlContext& context, TInMemNamespace& ns, TInMemStaging& staging) noexcept
+        : fContext(context), fNamespace(ns), fStaging(staging)
+    {}
+
+    /// Queues a class. One that is declared already, here or in the namespace, is tolerated and left out if both declarations are
+    /// the same. Errors: kAlreadyExists (12) if they differ.
+    void Add(TCimXmlDraft draft);
+
+    /// The class of that name, declared now if it is in the queue; null if it or one of its superclasses is not known yet.
+    /// Cost: constant for a class of the namespace; each class in the queue is tried a bounded number of times, however often this
+    /// is called. Errors: those of TCimXmlClassMaker.
+    boost::shared_ptr<TInMemClass> Find(const char* name);
+
+    /// Declares all that wait; for the end of the document. Errors: kNotFound (15) for a class whose superclass never came, or
+    /// which is below itself; those of TCimXmlClassMaker.
+    void DeclareAll();
+
+    /// How many classes have been declared.
+    std::size_t CountDeclared() const noexcept { return fDeclared; }
+    /// How often classes were looked at in order to declare them, for those who bound the work.
+    std::size_t CountTried() const noexcept { return fTried; }
+    /// The declared classes in the document's order; for after DeclareAll.
+    std::vector<boost::shared_ptr<ICIMElement>> GetClasses() const;
+
+  private:
+    enum EState : unsigned char {
+        kNew,      ///< not tried yet
+        kVisited,  ///< being tried
+        kStuck,    ///< tried while its topmost superclass was not known
+        kDeclared
+    };
+
+    struct TEntry {
+        TCimXmlDraft draft;
+        EState state;
+    };
+
+    /// What is said of a class that is declared already: each text follows the class's name.
+    struct TRepetition {
+        const char* kind;       ///< see TCimXmlContext::Tolerate
+        const char* tolerated;  ///< if both declarations are the same
+        const char* conflict;   ///< if they differ
+    };
+
+    void NoteRepeated(const std::string& name, bool isSame, const TRepetition& repetition);
+    void DeclareNew();
+    void DeclareStuck(const char* name);
+    void Declare(std::size_t number);
+    std::vector<std::size_t> CollectChain(std::size_t number, boost::shared_ptr<TInMemClass>& super);
+    [[noreturn]] void Refuse(const TCimXmlDraft& draft) const;
+
+    TCimXmlContext& fContext;
+    TInMemNamespace& fNamespace;
+    TInMemStaging& fStaging;
+    std::vector<TEntry> fEntries;    // in the document's order
+    TNameMap<std::size_t> fNumbers;  // of the entries, by class name
+    std::size_t fFirstNew = 0;       // entries in front of it have been tried
+    std::size_t fDeclared = 0;
+    std::size_t fTried = 0;
+};
+
+}  // namespace NORVZEL20

@@ -1,0 +1,143 @@
+// Filling instances: what most of a load's time goes into.
+//
+// An instance is one block of memory with a slot for each property of its class. Documents mostly list properties in the order in
+// which the class declares them, and instances of one class in a row. So the builder expects the class of the instance before and
+// the property after the one before; both are compared before anything is looked up by name. Which properties an instance has had
+// is kept in the class's layout, as the number of the last instance that had it, so nothing is cleared between instances.
+#include "embedded/cimxml/TCimXmlInstanceBuilder.h"
+
+#include "embedded/cimxml/MessageText.h"
+#include "embedded/store/TReferenceAdapter.h"
+#include "embedded/value/TValueText.h"
+
+namespace NORVZEL20 {
+
+using EStatus = TZELStatusCode::EStatusCode;
+
+bool TCimXmlInstanceBuilder::Begin(const char* className)
+{
+    TCimXmlLayout* layout = FindLayout(className);
+    if (layout == nullptr) {
+        return false;
+    }
+    fLayout = layout;
+    fInstance = layout->cls->AllocateInMemInstance();
+    fExpected = 0;
+    ++fNumber;
+    return true;
+}
+
+TCimXmlLayout* TCimXmlInstanceBuilder::FindLayout(const char* className)
+{
+    if (fLayout != nullptr && fLayout->cls->GetName() == className) {
+        return fLayout;
+    }
+    const auto known = fLayouts.find(className);
+    if (known != fLayouts.end()) {
+        return known->second.get();
+    }
+    const boost::shared_ptr<TInMemClass> cls = fClasses.Find(className);
+    if (!cls) {
+        return nullptr;
+    }
+    fStaging.KeepStaticValues(*cls);
+    return fLayouts.emplace(className, std::make_unique<TCimXmlLayout>(cls)).first->second.get();
+}
+
+TCimXmlTarget TCimXmlInstanceBuilder::FindProperty(const char* name)
+{
+    const TInMemClass& cls = *fLayout->cls;
+    const std::vector<std::uint32_t>& order = cls.GetSlotOrder();
+    std::uint32_t slot = TInMemClass::kNoSlot;
+    if (fExpected < order.size() && cls.GetSlotDecl(order[fExpected]).GetName() == name) {
+        slot = order[fExpected];
+    } else {
+        slot = cls.FindSlot(name);
+    }
+    if (slot == TInMemClass::kNoSlot) {
+        fContext.Fail(EStatus::kNotFound, "found property " + Quote(name) + ", but class " + Quote(cls.GetName()) +
+                                              " declares none of that name; add its declaration or correct the name");
+    }
+    if (fLayout->given[slot] == fNumber) {
+        fContext.Fail(EStatus::kParseError, DescribeSecondProperty(name, "instance"));
+    }
+    fLayout->given[slot] = fNumber;
+    fExpected = fLayout->positions[slot] + 1;
+    const TInMemPropertyDecl& decl = cls.GetSlotDecl(slot);
+    return {&decl.GetName(), slot, decl.GetType(), fLayout->embedded[slot]};
+}
+
+void TCimXmlInstanceBuilder::SetProperty(const TCimXmlTarget& target, TCIMValue&& value, bool metUnknownClass)
+{
+    if (value.GetType() != target.type) {
+        value = Convert(target, value);
+    }
+    fInstance->SetSlot(target.slot, std::move(value));
+    if (!metUnknownClass) {
+        return;
+    }
+    fLate.NoteReference(fInstance, target.slot, fClasses.CountDeclared());
+    fLayout->isHeld = fLayout->isHeld || fLayout->cls->GetSlotDecl(target.slot).IsKey();
+}
+
+TCIMValue TCimXmlInstanceBuilder::Convert(const TCimXmlTarget& target, const TCIMValue& value)
+{
+    const std::string& className = fLayout->cls->GetName();
+    TCIMValue converted;
+    if (!TValueText::Convert(value, target.type, converted)) {
+        fContext.Fail(EStatus::kTypeMismatch, "found " + Quote(value.ToText()) + " of type " +
+                                                  TValueText::DescribeType(value.GetType()) + " in property " +
+                                                  Quote(*target.name) + ", which class " + Quote(className) + " declares as " +
+                                                  TValueText::DescribeType(target.type));
+    }
+    fContext.Tolerate("other type", "property " + Quote(*target.name) + " of class " + Quote(className) + " is written as " +
+                                        TValueText::DescribeType(value.GetType()) + "; taken as the declared " +
+                                        TValueText::DescribeType(target.type));
+    return converted;
+}
+
+void TCimXmlInstanceBuilder::Fill(const TCimXmlDraft& draft, const TReadObjects& readObjects)
+{
+    const TEmbeddedObject& object = draft.object;
+    if (!Begin(object.GetClassName().c_str())) {
+        fContext.Fail(EStatus::kNotFound, "found an instance of class " + Quote(object.GetClassName()) + kIsNotDeclared);
+    }
+    const TReferenceAdapter adapter(fNamespace);
+    for (std::size_t index = 0; index < object.GetProperties().size(); ++index) {
+        const TCimXmlContext::TAt at(fContext, draft.propertyPlaces[index]);
+        const TEmbeddedObject::TProperty& property = object.GetProperties()[index];
+        const TCimXmlTarget target = FindProperty(property.fName.c_str());
+        TCIMValue value = target.isEmbedded ? readObjects(property.fValue) : property.fValue;
+        adapter.Adapt(value);
+        SetProperty(target, std::move(value), false);
+    }
+}
+
+boost::shared_ptr<TInMemInstance> TCimXmlInstanceBuilder::Take(const TOwnKeys* ownKeys)
+{
+    if (ownKeys != nullptr && fInstance->FindMissingKey() != nullptr) {
+        FillKeys(*ownKeys);
+    }
+    return std::move(fInstance);
+}
+
+/// Takes keys that the instance leaves out from the name in front of it.
+void TCimXmlInstanceBuilder::FillKeys(const TOwnKeys& keys)
+{
+    for (const auto& [name, value] : keys) {
+        const std::uint32_t slot = fLayout->cls->FindSlot(name);
+        if (slot == TInMemClass::kNoSlot || fLayout->given[slot] == fNumber) {
+            continue;
+        }
+        const TInMemPropertyDecl& decl = fLayout->cls->GetSlotDecl(slot);
+        TCIMValue converted = value;
+        TValueText::Convert(value, decl.GetType(), converted);  // if that fails, SetProperty reports it
+        TReferenceAdapter(fNamespace).Adapt(converted);         // the name was read before classes in front of it were declared
+        const bool isReference = decl.GetType() == TCIMValue::TCIMType::kReference;  // perhaps to a class that is not known yet
+        SetProperty({&decl.GetName(), slot, decl.GetType(), false}, std::move(converted), isReference);
+        fContext.Tolerate("key from name", "an instance of class " + Quote(fLayout->cls->GetName()) + " leaves out its key " +
+                                               Quote(name) + "; taken from the name in front of it");
+    }
+}
+
+}  // namespace NORVZEL20

@@ -1,0 +1,68 @@
+#pragma once
+
+#include <boost/function.hpp>
+#include <boost/smart_ptr/shared_ptr.hpp>
+#include <cstddef>
+#include <cstdint>
+#include <memory>
+#include <string>
+#include <utility>
+#include <vector>
+
+#include "embedded/cimxml/TCimXmlClassQueue.h"
+#include "embedded/cimxml/TCimXmlLateInstances.h"
+#include "embedded/cimxml/TCimXmlLayout.h"
+#include "embedded/cimxml/TCimXmlTarget.h"
+
+namespace NORVZEL20 {
+
+/// Fills instances of declared classes, one after the other, property by property.
+///
+/// Order of calls: Begin; FindProperty and SetProperty for each property, or Fill; Take.
+/// Errors: every operation fails through the context.
+class TCimXmlInstanceBuilder {
+  public:
+    using TOwnKeys = std::vector<std::pair<std::string, TCIMValue>>;
+    /// Returns a value with those of its texts read that are embedded objects.
+    using TReadObjects = boost::function<TCIMValue(const TCIMValue&)>;
+
+    /// All arguments must outlive the builder.
+    TCimXmlInstanceBuilder(TCimXmlContext& context, TInMemNamespace& ns, TInMemStaging& staging, TCimXmlClassQueue& classes,
+                           TCimXmlLateInstances& late) noexcept
+        : fContext(context), fNamespace(ns), fStaging(staging), fClasses(classes), fLate(late)
+    {}
+
+    /// Starts an instance; false if its class is not known yet.
+    bool Begin(const char* className);
+    /// Errors: kNotFound (15) if the class has no such property, kParseError (9) if the instance has had it already.
+    TCimXmlTarget FindProperty(const char* name);
+    /// `metUnknownClass` says that the value refers to a class that is not declared yet. A value of another type is converted.
+    /// Errors: kTypeMismatch (13) if that would lose something.
+    void SetProperty(const TCimXmlTarget& target, TCIMValue&& value, bool metUnknownClass);
+    /// Begins the instance and sets all its properties; for drafts whose document has ended. Errors: kNotFound (15) if its class is
+    /// not declared; those of FindProperty and SetProperty.
+    void Fill(const TCimXmlDraft& draft, const TReadObjects& readObjects);
+    /// Ends the instance. `ownKeys` (may be null) are the keys of the name in front of it, for those that it leaves out.
+    boost::shared_ptr<TInMemInstance> Take(const TOwnKeys* ownKeys);
+
+    /// Whether the instances of the last instance's class are held; see TCimXmlLateInstances::Hold.
+    bool IsHeld() const noexcept { return fLayout->isHeld; }
+
+  private:
+    TCimXmlLayout* FindLayout(const char* className);
+    TCIMValue Convert(const TCimXmlTarget& target, const TCIMValue& value);
+    void FillKeys(const TOwnKeys& keys);
+
+    TCimXmlContext& fContext;
+    TInMemNamespace& fNamespace;
+    TInMemStaging& fStaging;
+    TCimXmlClassQueue& fClasses;
+    TCimXmlLateInstances& fLate;
+    TNameMap<std::unique_ptr<TCimXmlLayout>> fLayouts;  // by class name
+    TCimXmlLayout* fLayout = nullptr;                   // of the instance being filled, or of the last one
+    boost::shared_ptr<TInMemInstance> fInstance;
+    std::uint32_t fNumber = 0;  // of the instance, from 1
+    std::size_t fExpected = 0;  // the position of the property that is likely to come next
+};
+
+}  // namespace NORVZEL20

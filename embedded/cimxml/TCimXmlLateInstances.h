@@ -1,0 +1,58 @@
+#pragma once
+
+#include <boost/smart_ptr/shared_ptr.hpp>
+#include <cstddef>
+#include <cstdint>
+#include <utility>
+#include <vector>
+
+#include "embedded/cimxml/TCimXmlContext.h"
+#include "embedded/cimxml/TCimXmlDraft.h"
+#include "embedded/store/TInMemInstance.h"
+#include "embedded/store/TInMemNamespace.h"
+
+namespace NORVZEL20 {
+
+/// Instances and references that need a class which the document declares only later. Plain storage: the loader works it off when
+/// the document has ended.
+class TCimXmlLateInstances {
+  public:
+    /// An instance that is filled but not added, and where it stands in the document.
+    struct THeld {
+        boost::shared_ptr<TInMemInstance> instance;
+        TCimXmlContext::TPlace place;
+    };
+
+    /// From now on all instances wait as drafts; called when the class of one is not declared yet.
+    void StartWaiting() noexcept { fIsWaiting = true; }
+    bool IsWaiting() const noexcept { return fIsWaiting; }
+    void Wait(TCimXmlDraft draft) { fDrafts.push_back(std::move(draft)); }
+
+    /// Holds an instance back, because one of its keys refers to a class that is not declared yet.
+    void Hold(const boost::shared_ptr<TInMemInstance>& instance, const TCimXmlContext::TPlace& place)
+    {
+        fHeld.push_back({instance, place});
+    }
+
+    /// Notes a property that refers to a class which is not declared yet. `declared` is how many classes are.
+    void NoteReference(const boost::shared_ptr<TInMemInstance>& instance, std::uint32_t slot, std::size_t declared)
+    {
+        fDeclaredBefore = fReferences.empty() ? declared : fDeclaredBefore;
+        fReferences.emplace_back(instance, slot);
+    }
+    /// Writes the noted references as their classes, of which `declared` are declared by now, say. To be called before TakeHeld.
+    void ResolveReferences(const TInMemNamespace& ns, std::size_t declared);
+
+    /// Those that were held and those that waited, each once and in the document's order.
+    std::vector<THeld> TakeHeld() noexcept { return std::exchange(fHeld, {}); }
+    std::vector<TCimXmlDraft> TakeDrafts() noexcept { return std::exchange(fDrafts, {}); }
+
+  private:
+    bool fIsWaiting = false;
+    std::vector<TCimXmlDraft> fDrafts;
+    std::vector<THeld> fHeld;
+    std::vector<std::pair<boost::shared_ptr<TInMemInstance>, std::uint32_t>> fReferences;
+    std::size_t fDeclaredBefore = 0;  // classes, when the first reference was noted
+};
+
+}  // namespace NORVZEL20
