@@ -115,7 +115,7 @@ void TCimXmlClassMaker::AddQualifiers(TElement& element, const TQualifiers& qual
     }
 }
 
-/// Notes what is odd about a qualifier: real servers and published schemas have both kinds.
+/// Notes what is odd about a qualifier. Real servers write undeclared ones, published schemas restate flavors.
 void TCimXmlClassMaker::NoteQualifier(const TEmbeddedObject::TQualifier& qualifier, const ICIMQualifier* inherited)
 {
     if (!fNamespace.FindQualifierDecl(qualifier.fName)) {

@@ -9,16 +9,18 @@
 
 namespace NORVZEL20 {
 
-/// Makes classes from what documents tell of them.
+/// Makes classes from their drafts.
 ///
-/// Elements that a document repeats from a superclass (PROPAGATED) are left to be inherited where the superclass has them.
-/// Qualifiers without a declaration, and restated ones with another flavor, are put up with. Errors: every operation fails through
-/// the context, also where a class would go beyond TSchemaLimits.
+/// A part that a document repeats from the superclass (PROPAGATED) is left out if the superclass has it, and so is inherited.
+/// Qualifiers without a declaration, and restated ones with another flavor, are tolerated.
+/// Errors: fails through the context with kParseError (9) if a name cannot stand in a path, a part is declared twice or the class
+/// would exceed TSchemaLimits, with kTypeMismatch (13) if a property has another type than in a superclass.
 class TCimXmlClassMaker {
   public:
+    /// `ns` is what the class is for. Both arguments must outlive the maker.
     TCimXmlClassMaker(TCimXmlContext& context, TInMemNamespace& ns) : fContext(context), fNamespace(ns) {}
 
-    /// A class that is not added yet; `super` is null for a top-level class.
+    /// A class that is not added to the namespace yet; `super` is null for a top-level class.
     boost::shared_ptr<TInMemClass> Make(const TCimXmlDraft& draft, const boost::shared_ptr<TInMemClass>& super);
 
   private:

@@ -14,16 +14,20 @@ namespace NORVZEL20 {
 
 class TXmlReader;
 
-/// What all parts of one load share: the report, the place in the document, and the one way to fail.
+/// What all parts of one load share: the report, the place in the document, the pool of texts, and the one way to fail.
+///
+/// "Fails" means everywhere in this folder: throws TPopulateError with the status named and with the place that GetPlace returns.
+/// Threads: one at a time, as the load that it belongs to.
 class TCimXmlContext {
   public:
-    /// Where something stands in the document.
+    /// Where something stands in the document, counted from 1.
     struct TPlace {
         std::size_t line = 0;
         std::size_t column = 0;
     };
 
-    /// Says of which place things are told while it lives, instead of the one being read.
+    /// While it lives, errors and notes are reported at `place` and not where the document is being read: for what was read earlier
+    /// and is used only now. They may nest; the innermost counts.
     class TAt {
       public:
         TAt(TCimXmlContext& context, const TPlace& place) : fContext(context), fEarlier(context.fPlace) { context.fPlace = place; }
@@ -36,25 +40,27 @@ class TCimXmlContext {
         TPlace fEarlier;
     };
 
-    /// `file` is what the document is called in messages.
+    /// `file` is what messages call the document.
     explicit TCimXmlContext(std::string file) : fFile(std::move(file)) {}
 
-    /// Names the reader that tells the place; it must outlive the context's use.
+    /// Sets the XML reader that knows the place; to be called before the load begins. The reader must outlive the load.
     void SetReader(const TXmlReader& reader) noexcept { fReader = &reader; }
 
-    /// Ends the load. Errors: TPopulateError, always.
+    /// Ends the load. `message` says what was found and what was expected or can be done.
     [[noreturn]] void Fail(TZELStatusCode::EStatusCode status, const std::string& message) const;
 
+    /// The place of the innermost TAt, or else where the document is being read.
     TPlace GetPlace() const;
 
-    /// Puts up with something: `text` describes the first one of `kind`, the others are counted.
+    /// Notes in the report something odd that does not end the load. `kind` must be a string literal: the first call with it adds
+    /// `text` and its place to the report, later ones are counted.
     void Tolerate(const char* kind, const std::string& text);
 
-    /// The document names its namespace, and the host beside it where `host` is not empty. Errors: fails with status 9 for a second
-    /// namespace, or host, that is not the first.
+    /// Notes the namespace that the document names for itself, with its host (may be empty). The first of each goes to the report.
+    /// Errors: fails with kParseError (9) for a namespace or a host that is not the first one.
     void NoteNamespace(const std::string& name, const std::string& host);
 
-    /// Whether a path to that namespace and host stays within the document's own namespace.
+    /// Whether a path with that namespace and host (may be empty) stays within the document's own namespace.
     bool IsOwn(const std::string& name, const std::string& host) const;
 
     TLoadReport& GetReport() noexcept { return fReport; }
@@ -65,11 +71,12 @@ class TCimXmlContext {
     void EnterEmbeddedObject();
     void LeaveEmbeddedObject() noexcept { --fEmbeddedDepth; }
 
-    /// Fails with status 9 where `name` is none that a path can hold: of letters, digits and underscores, or beyond ASCII. `what`
-    /// says what it is the name of.
+    /// Checks a name that may become part of a path. `what` says what it names: "class", "property" or "key". Errors: fails with
+    /// kParseError (9) if it has characters other than ASCII letters, digits, underscores and what is beyond ASCII.
     void CheckName(const char* what, std::string_view name) const;
 
-    /// Does something that the namespace or a value may refuse; that then ends the load, at this place.
+    /// Returns what `act` returns. If it throws a TZELException, because the namespace or a value refuses something, fails with
+    /// that status and adds the place; a TPopulateError passes as it is.
     template <class TAct>
     auto Guard(TAct act) const -> decltype(act())
     {
@@ -78,18 +85,18 @@ class TCimXmlContext {
         } catch (const TPopulateError&) {
             throw;
         } catch (const TZELException& error) {
-            Fail(error.GetStatusCode().GetStatus(), std::string("found what cannot be taken: ") + error.what());
+            Fail(error.GetStatusCode().GetStatus(), std::string("found something that cannot be loaded: ") + error.what());
         }
     }
 
   private:
     std::string fFile;
     const TXmlReader* fReader = nullptr;
-    TPlace fPlace;  // line 0: where the reader is
+    TPlace fPlace;  // of the innermost TAt; line 0 if there is none
     TLoadReport fReport;
-    std::vector<const char*> fKinds;  // of fReport.tolerated
+    std::vector<const char*> fKinds;  // of the entries of fReport.tolerated
     TTextPool fTexts;
-    std::size_t fEmbeddedDepth = 0;  // embedded objects that are being read, one within the other
+    std::size_t fEmbeddedDepth = 0;  // embedded objects that are being read, one inside of the other
 };
 
 }  // namespace NORVZEL20

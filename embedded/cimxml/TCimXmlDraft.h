@@ -8,18 +8,18 @@
 
 namespace NORVZEL20 {
 
-/// A class or an instance as a document tells it, with where it stands there, until it can be made part of a namespace.
+/// A class or an instance as a document describes it, with its place there, until it can be added to a namespace.
 struct TCimXmlDraft {
     TEmbeddedObject object;
     TCimXmlContext::TPlace place;
     std::vector<TCimXmlContext::TPlace> propertyPlaces;      ///< in the order of the object's properties
-    std::vector<std::pair<std::string, TCIMValue>> ownKeys;  ///< of an instance: the keys of the name in front of it
+    std::vector<std::pair<std::string, TCIMValue>> ownKeys;  ///< for an instance: the keys of the name in front of it
 };
 
-/// A qualifier's declaration as a document tells it.
+/// A qualifier's declaration as a document describes it.
 struct TCimXmlQualifierDraft {
     std::string name;
-    TCIMValue value;  ///< gives the type; a typed null where there is no default
+    TCIMValue value;  ///< has the type; a typed null if there is no default
     ICIMQualifierDecl::EScope scope = ICIMQualifierDecl::kScopeNone;
     ICIMQualifierDecl::EFlavor flavor = ICIMQualifierDecl::kFlavorDefault;
 };

@@ -1,3 +1,11 @@
+// Drafts: classes and instances as the document describes them, before the namespace knows them.
+//
+// A draft is a TEmbeddedObject with the places of its parts in the document, for messages that come only when the draft is used.
+// Classes always become drafts, because their superclass may come later. Instances become drafts if their class is not declared
+// yet, and inside of embedded objects, which belong to no namespace.
+//
+// Elements nest (class, property or method, parameter, qualifier). The builder keeps the innermost open one of each kind, and moves
+// it into the one around it when it ends. A qualifier goes to the innermost element that is open.
 #include "embedded/cimxml/TCimXmlDraftBuilder.h"
 
 #include <utility>
@@ -29,7 +37,7 @@ TCimXmlDraft TCimXmlDraftBuilder::Take()
     return draft;
 }
 
-/// Fails where there are as many as there may be.
+/// Fails if there are as many as there may be.
 void TCimXmlDraftBuilder::CheckRoom(std::size_t count, std::size_t most, const char* what) const
 {
     if (count >= most) {

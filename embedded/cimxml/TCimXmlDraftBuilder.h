@@ -9,20 +9,23 @@
 
 namespace NORVZEL20 {
 
-/// Puts a class or an instance together while its elements are read.
+/// Puts the draft of a class or an instance together while its elements are read.
 ///
-/// Errors: every operation fails through the context, also where something would go beyond TSchemaLimits.
+/// Order of calls: BeginClass or BeginInstance, the parts in the order in which they nest, Take.
+/// Errors: every operation fails through the context, with kParseError (9) if an attribute is missing or wrong, a property comes
+/// twice, or there are more parts than TSchemaLimits allows.
 class TCimXmlDraftBuilder {
   public:
     explicit TCimXmlDraftBuilder(TCimXmlContext& context) : fContext(context) {}
 
     void BeginClass(const TCimXmlAttributes& attributes);
     void BeginInstance(const char* className);
-    bool IsOpen() const noexcept { return fDraft.has_value(); }
+    /// Ends the class or instance.
     TCimXmlDraft Take();
 
+    /// The value, and with it the type, comes at the end.
     void BeginProperty(const char* name, const TCimXmlAttributes& attributes);
-    /// Of the property that is open; valid until it ends.
+    /// The name of the property that is open; valid until it ends.
     const std::string& GetPropertyName() const noexcept { return fProperty->fName; }
     void EndProperty(TCIMValue value);
     void BeginMethod(const TCimXmlAttributes& attributes);

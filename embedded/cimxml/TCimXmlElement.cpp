@@ -81,7 +81,7 @@ constexpr std::size_t GetBucket(std::string_view name)
     return (name.size() * 37 + at(0) * 7 + at(name.size() - 1) * 11 + at(name.size() / 2) * 3) % kBuckets;
 }
 
-/// Open addressing over the names, worked out by the compiler.
+/// A hash table with open addressing, computed by the compiler.
 constexpr std::array<unsigned char, kBuckets> MakeBuckets()
 {
     std::array<unsigned char, kBuckets> buckets{};
@@ -104,7 +104,7 @@ TCimXmlElement::EElement TCimXmlElement::Find(const char* name) noexcept
     const std::string_view text(name, std::strlen(name));
     for (std::size_t bucket = GetBucket(text); kElements[bucket] != kUnknown; bucket = (bucket + 1) % kBuckets) {
         if (kNames[kElements[bucket]] == text) {
-            return EElement(kElements[bucket]);
+            return static_cast<EElement>(kElements[bucket]);
         }
     }
     return kUnknown;

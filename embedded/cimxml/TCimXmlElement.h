@@ -4,7 +4,7 @@
 
 namespace NORVZEL20 {
 
-/// The elements of CIM-XML (DSP0203) that a loader meets.
+/// The elements of CIM-XML (DSP0203) that a document to load may have.
 class TCimXmlElement {
   public:
     enum EElement : unsigned char {
@@ -72,9 +72,9 @@ class TCimXmlElement {
 
     TCimXmlElement() = delete;
 
-    /// The element of that name, byte for byte; kUnknown where there is none.
+    /// The element of that name, compared byte for byte; kUnknown if there is none. Cost: constant.
     static EElement Find(const char* name) noexcept;
-    /// Its name as documents write it; "" for kUnknown.
+    /// The name of an element, as documents write it; "" for kUnknown.
     static const char* GetName(EElement element) noexcept;
 };
 

@@ -16,7 +16,7 @@ TEmbeddedObject::TQualifier FromQualifier(const ICIMQualifier& qualifier)
     return {qualifier.GetName(TCallContext()), qualifier.GetValue(TCallContext()), qualifier.GetFlavor(TCallContext()), false};
 }
 
-/// The element's own qualifiers where it tells them apart from inherited ones.
+/// The element's own qualifiers if it is one of this host (`inMemory` is not null), otherwise inherited ones too.
 template <class TElement, class TInMemory>
 TQualifiers FromQualifiers(const TElement& element, const TInMemory* inMemory)
 {
@@ -90,7 +90,7 @@ void AddAllElements(TEmbeddedObject& object, const ICIMClass& cls)
     cls.EnumerateMethodDecls(addMethod, TCallContext());
 }
 
-/// Leaves out what is propagated, in the elements' qualifiers too.
+/// The elements without the propagated ones, and without propagated qualifiers on the others.
 template <class TElement>
 std::vector<TElement> OwnOf(const std::vector<TElement>& elements)
 {

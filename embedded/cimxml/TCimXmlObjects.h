@@ -6,13 +6,13 @@
 
 namespace NORVZEL20 {
 
-/// Classes and instances of a namespace as free-standing objects, for writing and comparing.
+/// Classes and properties of a namespace as free-standing objects, for writing and comparing.
 class TCimXmlObjects {
   public:
     TCimXmlObjects() = delete;
 
-    /// What the class itself declares or overrides, with its own qualifiers. A class of another host than this one shows all that
-    /// it has, inherited elements included, because the interfaces do not tell them apart; parameters it does not show.
+    /// What the class itself declares or overrides, with its own qualifiers. For a class of another host, which the interfaces show
+    /// only in part: everything that it has, inherited elements included, and methods without parameters.
     static TEmbeddedObject FromClass(const ICIMClass& cls);
 
     /// The class without the elements and qualifiers that are marked as propagated from a superclass.

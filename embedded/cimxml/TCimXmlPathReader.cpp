@@ -1,3 +1,18 @@
+// Object paths.
+//
+// A path is a namespace, a class and, for an instance, keys. A key may be a path itself:
+//
+//     <INSTANCENAME CLASSNAME="Part"><KEYBINDING NAME="On"><VALUE.REFERENCE>
+//         <INSTANCENAME CLASSNAME="Disk"><KEYBINDING NAME="Id"><KEYVALUE>5</KEYVALUE></KEYBINDING></INSTANCENAME>
+//     </VALUE.REFERENCE></KEYBINDING></INSTANCENAME>
+//
+// So there is a stack of frames, one for each open path, and values go to the innermost. The outermost frame may be the name of an
+// object, which stands in front of the object and stays open until the object ends. A namespace outside of any path is the
+// document's own.
+//
+// Two paths to the same instance must read the same. So a path within the document's namespace is stored without one, and names and
+// types of keys are written as the class declares them. If the class is not declared yet, that happens later, when the loader is
+// notified by TakeMetUnknownClass.
 #include "embedded/cimxml/TCimXmlPathReader.h"
 
 #include <cstring>
@@ -12,13 +27,13 @@ namespace NORVZEL20 {
 
 namespace {
 
-// As deep as a path of the host may hold others, the object's own counted.
+// The host's paths nest no deeper; the name of the object itself counts.
 constexpr std::size_t kMaxDepth = 12;
 
 using EStatus = TZELStatusCode::EStatusCode;
 using TType = TCIMValue::TCIMType;
 
-/// A number whose type the document does not tell.
+/// A number whose type the document does not give: the first of these types that can hold it.
 bool ReadNumber(std::string_view text, TCIMValue& value)
 {
     return TValueText::Parse(TType::kUint64, text, value) || TValueText::Parse(TType::kSint64, text, value) ||
@@ -96,7 +111,7 @@ void TCimXmlPathReader::FailTooDeep() const
                   "found object paths within each other more than " + std::to_string(kMaxDepth) + " deep, expected fewer");
 }
 
-/// The key that a value without a name belongs to.
+/// The key that a value without a name belongs to: the class must have exactly one.
 const std::string& TCimXmlPathReader::FindOnlyKey(const TInMemClass* cls) const
 {
     if (cls == nullptr || cls->GetKeySlots().size() != 1) {

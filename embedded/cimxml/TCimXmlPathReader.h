@@ -14,26 +14,28 @@
 
 namespace NORVZEL20 {
 
-/// Puts object paths together while their elements are read; a key may itself be a path, so paths nest.
+/// Puts object paths together while their elements are read. A key may be a path itself, so paths nest.
 ///
-/// Paths that stay within the document's own namespace come without one. Key values get the declared type of their key where the
-/// class is known and nothing is lost.
+/// A path within the document's own namespace comes without a namespace. If the class is declared, a key value gets the declared
+/// type of its key, unless that would lose something.
+/// Errors: every operation fails through the context, with kParseError (9) if the path is not well-formed and kTypeMismatch (13) if
+/// a key's text is no value of its type.
 class TCimXmlPathReader {
   public:
-    /// `ns` (may be null) is where classes are looked up.
+    /// `ns` (may be null) is where classes are looked up. `context` must outlive the reader.
     TCimXmlPathReader(TCimXmlContext& context, boost::shared_ptr<TInMemNamespace> ns);
 
-    /// Begins a path within the innermost. Errors: fails with status 9 where paths stand in each other too deeply.
+    /// Begins a path inside of the innermost one. Errors: kParseError (9) if paths are nested too deeply.
     void Begin();
-    /// Ends the innermost path. Errors: fails with status 9 where it has no class.
+    /// Ends the innermost path. Errors: kParseError (9) if it has no class, or a key twice.
     TCIMReference End();
-    /// Ends the innermost path without making one of it.
+    /// Ends the innermost path and forgets it.
     void Drop() noexcept { --fDepth; }
 
     void BeginNamespacePath();
     void AddNamespace(const char* name);
     void SetHost(std::string_view host);
-    /// To be called at the end of the element; where no path is open, the namespace is the document's own.
+    /// Ends NAMESPACEPATH or LOCALNAMESPACEPATH. If no path is open, the namespace is the document's own.
     void EndNamespacePath();
 
     void SetClassName(const char* name);
@@ -43,15 +45,16 @@ class TCimXmlPathReader {
     void EndKeyValue(std::string_view text);
     void AddKey(TCIMValue value);
 
-    /// The keys of the object's own name, read before the object, by name; valid until the next Begin.
+    /// The keys of the name in front of the object, each with its own name; valid until the next Begin.
     const std::vector<std::pair<std::string, TCIMValue>>& GetOwnKeys() const noexcept { return fFrames.front().keys; }
+    /// Whether there is a name in front of the object that is open.
     bool HasOwnPath() const noexcept { return fDepth > 0 && !fFrames.front().className.empty(); }
-    /// Takes the document's namespace from the object's own name.
+    /// Takes the document's namespace from the name in front of the object, if it has one.
     void NoteOwnNamespace();
 
-    /// Whether End met a class that is not declared since this was last asked.
+    /// Whether a path that has ended since the last call is to a class that is not declared.
     bool TakeMetUnknownClass() noexcept { return std::exchange(fMetUnknownClass, false); }
-    /// For paths that another reader has read.
+    /// Reports such a path that another reader has read.
     void NoteUnknownClass() noexcept { fMetUnknownClass = true; }
 
   private:
@@ -59,8 +62,8 @@ class TCimXmlPathReader {
         std::string namespaceName;
         std::string host;
         std::string className;
-        std::string keyName;       // of the KEYBINDING that is open and has no value yet
-        bool isInBinding = false;  // one is open
+        std::string keyName;       // of the open KEYBINDING, until it has its value
+        bool isInBinding = false;  // a KEYBINDING is open
         std::vector<std::pair<std::string, TCIMValue>> keys;
     };
 

@@ -1,3 +1,10 @@
+// One load, from bytes to a namespace:
+//
+//     file, memory or source --bytes--> TXmlReader --events--> TCimXmlReader --classes, instances--> TCimXmlLoader --> namespace
+//
+// TLoad owns these parts and the TCimXmlContext that they share (the place for messages, the report, the pool of texts). All of
+// them live for one load only. If anything throws, TLoad is destroyed, and the loader takes back what it added, so a load is all
+// or nothing.
 #include "embedded/cimxml/TCimXmlPopulator.h"
 
 #include <algorithm>
@@ -26,7 +33,7 @@ struct TFileCloser {
     void operator()(std::FILE* file) const noexcept { std::fclose(file); }
 };
 
-/// Delivers a file piece by piece.
+/// Reads a file piece by piece.
 class TFileSource {
   public:
     explicit TFileSource(const std::string& path) : fPath(path), fFile(std::fopen(path.c_str(), "rb"))
@@ -76,7 +83,7 @@ class TLoad {
         std::size_t length = 0;
         std::size_t room = 0;
         do {
-            // A tag that goes on and on is read again with each piece: growing pieces keep that in proportion.
+            // Expat reads a tag that has not ended again with each piece. Pieces as long as that tag keep the total linear.
             room = std::max(kPiece, fXml.GetPending());
             length = Fill(source, fXml.GetBuffer(room), room);
             total += length;
@@ -93,7 +100,7 @@ class TLoad {
         fContext.Guard([this] { fLoader.Finish([this](const TCIMValue& value) { return fReader.GetObjects().ReadAll(value); }); });
     }
 
-    /// Nothing can fail from here on.
+    /// Keeps what was loaded; nothing can fail any more.
     TLoadReport Commit() noexcept
     {
         fLoader.Commit();
@@ -101,7 +108,7 @@ class TLoad {
     }
 
   private:
-    /// Pulls until the room is full or the document ends, so that sources that deliver little make no small pieces.
+    /// Pulls until the room is full or the document ends: many small pieces would be parsed slowly.
     static std::size_t Fill(const TCimXmlPopulator::TPullSource& source, char* buffer, std::size_t room)
     {
         std::size_t length = 0;
@@ -144,7 +151,7 @@ TLoadReport TCimXmlPopulator::Load(const std::string& name, TRead read)
 {
     const auto ns = boost::dynamic_pointer_cast<TInMemNamespace>(fNamespace);
     if (!ns) {
-        throw TPopulateError(EStatus::kNotSupported, "the namespace is none of the provider \"inmem\", load into one of those",
+        throw TPopulateError(EStatus::kNotSupported, "the namespace is not one of the provider \"inmem\"; load into one of those",
                              name, 0, 0);
     }
     TLoad load(ns, name);

@@ -15,40 +15,46 @@ namespace NORVZEL20 {
 
 /// Loads CIM-XML documents (DSP0201) into a namespace: declarations in any kind of group, and recorded requests and responses.
 ///
-/// Classes may come in any order, and instances before their class; references are written as their classes are declared, wherever
-/// that stands. Only a key that a path tells without its name needs the class in front of it. Names of classes, properties and keys
-/// are of letters, digits, underscores and what is beyond ASCII, so that a path tells them apart. A property that an instance does
-/// not mention is null there. A reference without a namespace, or to the document's own namespace (and host), is stored without
-/// one. Each load is all or nothing: where it throws, the namespace is as it was. Errors of every load: TPopulateError with the
-/// statuses of TNamespacePopulator::PopulateFromXMLFile, 31 where the namespace is none of the provider "inmem"; std::bad_alloc.
-/// Nothing is logged. Threads: one at a time for each populator and namespace; several populators may work at once on namespaces of
-/// their own. Cost: one pass over the document; it is never held whole, but LoadFromMemory has the XML library copy it.
-/// Bounds, beyond which a document is refused with status 9: those of TXmlReader; 1000 superclasses of a class; 1024 properties of
-/// a class, an instance or an embedded object; 1024 methods of a class; 1024 qualifiers of an element; 256 key bindings of a path;
-/// 12 paths and 32 embedded objects within each other. Classes and elements count with what they inherit. An embedded object must
-/// not have a document type declaration (status 13).
+/// Order: classes may come in any order, and instances before their class. References are written as their classes are declared,
+/// wherever the declaration stands. There is one exception: a key value without a name needs its class in front of it.
+/// Names: those of classes, properties and keys consist of ASCII letters, digits, underscores and characters beyond ASCII, so they
+/// cannot be confused with the punctuation of a path.
+/// Values: a property that an instance does not mention is null, whatever its default. A reference without a namespace, or to the
+/// document's own namespace (and host), is stored without one.
+/// All or nothing: if a load throws, the namespace is as it was.
+/// Errors of every load: TPopulateError with the statuses of TNamespacePopulator::PopulateFromXMLFile, or kNotSupported (31) if the
+/// namespace is not one of the provider "inmem"; std::bad_alloc. Nothing is logged.
+/// Threads: use a populator, and a namespace, from one thread at a time; different populators may load into different namespaces
+/// concurrently.
+/// Cost: one pass over the document. It is never held whole, except that LoadFromMemory makes the XML library copy it.
+/// Bounds: a document that exceeds one is refused with kParseError (9). They are those of TXmlReader; 1000 superclasses of a class;
+/// 1024 properties of a class, an instance or an embedded object; 1024 methods of a class; 1024 qualifiers of an element; 256 key
+/// bindings of a path; 12 paths and 32 embedded objects inside of each other. Inherited parts count. An embedded object with a
+/// document type declaration is refused with kTypeMismatch (13).
 class TCimXmlPopulator {
   public:
-    /// Fills the buffer with at most so many bytes and returns how many; 0 ends the document, and is asked for once. May deliver as
-    /// little as it likes: small pieces are gathered before they are parsed. May throw: the load then fails with that exception.
+    /// Fills the buffer with at most that many bytes and returns how many. It may return as few as it likes: small pieces are
+    /// gathered before they are parsed. 0 ends the document; the source is not called again after that. If it throws, the load
+    /// fails with that exception.
     using TPullSource = boost::function<std::size_t(char*, std::size_t)>;
 
+    /// The populator keeps `ns`, which is where it loads.
     explicit TCimXmlPopulator(boost::shared_ptr<ICIMNamespace> ns);
 
-    /// Loads the `length` bytes at `data`, which are called `name` in messages.
+    /// Loads the `length` bytes at `data`. Messages call the document `name`.
     TLoadReport LoadFromMemory(const char* data, std::size_t length, const std::string& name);
 
-    /// Loads what `source` delivers.
+    /// Loads what `source` delivers. Messages call the document `name`.
     TLoadReport LoadFromSource(const TPullSource& source, const std::string& name);
 
-    /// Loads the file at `path`. Errors: also status 11 where it cannot be opened or read.
+    /// Loads the file at `path`. Errors: also kFileError (11) if it cannot be opened or read.
     TLoadReport LoadFile(const std::string& path);
 
-    /// From now on keeps what each load loads; for TakeElements.
+    /// From now on remembers what each load adds, for TakeElements.
     void KeepElements() { fKeep = true; }
 
-    /// The classes, then the instances of the last load that did not fail, each in the document's order. Empty without
-    /// KeepElements, and where they have been taken already.
+    /// The classes, then the instances of the last load that did not fail, each in the document's order. Empty without KeepElements
+    /// and when called again.
     std::vector<boost::shared_ptr<ICIMElement>> TakeElements();
 
   private:

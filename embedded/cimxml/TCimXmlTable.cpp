@@ -1,3 +1,20 @@
+// The grammar of CIM-XML as a table.
+//
+// A row says: in this state, this element may start; the next state is so and so; do this action. The next state belongs to the
+// element that has started, and it ends with that element. For example, reading
+//
+//     <INSTANCE CLASSNAME="Disk"><PROPERTY NAME="Id" TYPE="uint32"><VALUE>5</VALUE></PROPERTY></INSTANCE>
+//
+// inside of a VALUE.OBJECT goes through
+//
+//     state       element     next state   action at its start   action at its end
+//     kObject     INSTANCE    kInstance    kBeginInstance        kEndInstance
+//     kInstance   PROPERTY    kProperty    kBeginProperty        kEndProperty
+//     kProperty   VALUE       kText        kBeginText            kEndText
+//
+// Elements that mean the same share a state: all groups of declarations are kGroup, all kinds of VALUE.OBJECT are kObject. An
+// element without a row is an error, and the rows of the state are then what the message lists as expected. The rows are expanded
+// at compile time into an array that is indexed by state and element.
 #include "embedded/cimxml/TCimXmlTable.h"
 
 #include <array>
@@ -18,16 +35,19 @@ struct TRow {
 };
 
 constexpr TRow kRows[] = {
+    // The document's element; for an embedded object there is none around it.
     {T::kStart, E::kCim, T::kCim, T::kNothing},
     {T::kEmbedded, E::kInstance, T::kInstance, T::kBeginInstance},
     {T::kEmbedded, E::kClass, T::kClass, T::kBeginClass},
 
+    // Declarations.
     {T::kCim, E::kDeclaration, T::kDeclaration, T::kNothing},
     {T::kCim, E::kMessage, T::kMessage, T::kNothing},
     {T::kDeclaration, E::kDeclGroup, T::kGroup, T::kNothing},
     {T::kDeclaration, E::kDeclGroupWithName, T::kGroup, T::kNothing},
     {T::kDeclaration, E::kDeclGroupWithPath, T::kGroup, T::kNothing},
 
+    // Recorded requests and responses: what they carry is loaded, what only refers to objects is left out.
     {T::kMessage, E::kSimpleReq, T::kRequest, T::kNothing},
     {T::kMessage, E::kMultiReq, T::kMultiRequest, T::kNothing},
     {T::kMessage, E::kSimpleRsp, T::kResponse, T::kNothing},
@@ -71,6 +91,7 @@ constexpr TRow kRows[] = {
     {T::kReturned, E::kValueArray, T::kSkipped, T::kSkip},
     {T::kReturned, E::kValueReference, T::kSkipped, T::kSkip},
 
+    // The contents of a group, and of the VALUE.OBJECTs in it.
     {T::kGroup, E::kLocalNamespacePath, T::kLocalNamespacePath, T::kBeginNamespacePath},
     {T::kGroup, E::kNamespacePath, T::kNamespacePath, T::kBeginNamespacePath},
     {T::kGroup, E::kQualifierDeclaration, T::kQualifierDecl, T::kBeginQualifierDecl},
@@ -91,6 +112,7 @@ constexpr TRow kRows[] = {
     {T::kObject, E::kLocalInstancePath, T::kLocalInstancePath, T::kNothing},
     {T::kObject, E::kInstanceName, T::kInstanceName, T::kReadClassName},
 
+    // Classes, instances and what they consist of.
     {T::kClass, E::kQualifier, T::kQualifier, T::kBeginQualifier},
     {T::kClass, E::kProperty, T::kProperty, T::kBeginProperty},
     {T::kClass, E::kPropertyArray, T::kPropertyArray, T::kBeginProperty},
@@ -128,6 +150,7 @@ constexpr TRow kRows[] = {
     {T::kReferenceArray, E::kValueReference, T::kReference, T::kBeginReference},
     {T::kReferenceArray, E::kValueNull, T::kNull, T::kAddNull},
 
+    // Object paths.
     {T::kReference, E::kClassPath, T::kClassPath, T::kNothing},
     {T::kReference, E::kLocalClassPath, T::kLocalClassPath, T::kNothing},
     {T::kReference, E::kClassName, T::kClassName, T::kReadClassName},
@@ -188,7 +211,7 @@ constexpr TSteps MakeSteps()
     for (const TRow& row : kRows) {
         steps[row.state][row.element] = {row.next, row.action};
     }
-    for (T::TStep& step : steps[T::kSkipped]) {
+    for (T::TStep& step : steps[T::kSkipped]) {  // anything may stand in what is left out
         step = {T::kSkipped, T::kNothing};
     }
     return steps;

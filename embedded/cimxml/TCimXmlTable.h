@@ -6,10 +6,10 @@
 
 namespace NORVZEL20 {
 
-/// Which element may stand in which, and what reading it does: the states of a CIM-XML reader (DSP0201), as one table.
+/// Which element may stand in which, and what to do when it starts and ends: the grammar of CIM-XML (DSP0201) as one table.
 ///
-/// A state tells which element is open and what it belongs to. An element that the table does not accept in a state is an error
-/// of the document.
+/// A state says which element is open and what it is a part of. An element that the table does not accept in a state is an error of
+/// the document. Cost: Find and GetEndAction are one array access.
 class TCimXmlTable {
   public:
     enum EState : unsigned char {
@@ -56,11 +56,11 @@ class TCimXmlTable {
         kKeyBinding,
         kKeyValue,
         kError,
-        kSkipped,  ///< something that holds nothing to load
+        kSkipped,  ///< an element that holds nothing to load, whatever is in it
         kStateCount
     };
 
-    /// What the start of an element does, and the end of a state.
+    /// What to do when an element starts, and when the element of a state ends.
     enum EAction : unsigned char {
         kRefuse = 0,  ///< the element may not stand here
         kNothing,
@@ -98,10 +98,10 @@ class TCimXmlTable {
         kBeginKeyValue,
         kEndKeyValue,
         kReadError,
-        kSkip  ///< leaves something out, and says so in the report
+        kSkip  ///< leaves the element out and says so in the report
     };
 
-    /// One entry: what reading an element in a state leads to.
+    /// One entry: what follows if an element starts in a state.
     struct TStep {
         EState next;
         EAction action;
@@ -109,11 +109,11 @@ class TCimXmlTable {
 
     TCimXmlTable() = delete;
 
-    /// The step for `element` in `state`; its action is kRefuse where the element may not stand there.
+    /// The step for `element` in `state`; its action is kRefuse if the element may not stand there.
     static TStep Find(EState state, TCimXmlElement::EElement element) noexcept;
-    /// What is done when the element of `state` ends.
+    /// What to do when the element of `state` ends.
     static EAction GetEndAction(EState state) noexcept;
-    /// Whether character data means something in `state`.
+    /// Whether character data may stand in `state`; elsewhere only white space may.
     static bool TakesText(EState state) noexcept
     {
         return state == kText || state == kKeyValue || state == kHost || state == kSkipped;

@@ -1,3 +1,11 @@
+// Writing a namespace.
+//
+// The document is one group: qualifier declarations, then classes with superclasses first, then instances. Elements are appended to
+// a buffer, which goes to the sink when it has reached the size of a piece. An element is appended whole or not at all: if reading
+// it from the namespace throws, the buffer is cut back to where the element began. If the sink throws, the buffer is kept, so the
+// same piece is offered again.
+//
+// Values, properties and paths are written by TValueXml; this file adds what surrounds them.
 #include "embedded/cimxml/TCimXmlWriter.h"
 
 #include <algorithm>
@@ -32,7 +40,7 @@ void AppendScope(std::string& out, TDecl::EScope scope)
     out += "/>";
 }
 
-/// The parts of a namespace's name, each in an element of its own, after the host where there is one.
+/// The parts of a namespace's name, each in an element of its own, after the host if there is one.
 void AppendNamespacePath(std::string& out, const std::string& name, const std::string& host)
 {
     if (!host.empty()) {
@@ -126,14 +134,14 @@ std::vector<boost::shared_ptr<ICIMClass>> TCimXmlWriter::CollectClasses(ICIMName
 void TCimXmlWriter::StartDocument(const std::string& namespaceName, const std::string& host)
 {
     fEnded = false;
-    fBuffer.clear();  // of what a document that failed may have left
+    fBuffer.clear();  // a document that failed may have left something
     fBuffer += "<?xml version=\"1.0\" encoding=\"utf-8\"?>\n<CIM CIMVERSION=\"2.0\" DTDVERSION=\"2.0\"><DECLARATION><DECLGROUP>\n";
     if (!namespaceName.empty()) {
         AppendNamespacePath(fBuffer, namespaceName, host);
     }
 }
 
-/// Appends what `append` appends, or, where that throws, nothing.
+/// Appends an element whole, or nothing if `append` throws.
 template <class TAppend>
 void TCimXmlWriter::WriteElement(const TAppend& append)
 {

@@ -14,11 +14,13 @@ namespace NORVZEL20 {
 
 /// Writes a namespace as CIM-XML (DSP0201), so that loading the document gives an equal namespace.
 ///
-/// Text reaches the sink in pieces of some 64 KiB, in UTF-8; nothing is held beyond that. What XML readers would change is
-/// written as a character reference; a control character that XML 1.0 cannot carry becomes U+FFFD. Output depends on the contents
-/// of the namespace alone. Errors: what the sink or the namespace throws; an element that could not be told whole is not written at
-/// all. A piece that the sink refused is kept, with the element that filled it, which counts as written: the next piece begins with
-/// it, and EndDocument may be called again to offer it again. StartDocument begins anew.
+/// Text goes to the sink in pieces of about 64 KiB, in UTF-8; no more than that is held. Characters that XML readers would change
+/// are written as character references; a control character that XML 1.0 cannot carry becomes U+FFFD. The output depends on the
+/// contents of the namespace alone.
+/// Errors: what the sink or the namespace throws. If reading an element throws, nothing of that element is written. If the sink
+/// throws, its piece is kept, including the element that filled it; the next piece begins with it, and calling EndDocument again
+/// offers it again. StartDocument discards it.
+/// Threads: one at a time; the namespace must not change meanwhile.
 class TCimXmlWriter {
   public:
     using TSink = boost::function<void(std::string_view)>;
@@ -27,20 +29,21 @@ class TCimXmlWriter {
     TCimXmlWriter(const TCimXmlWriter&) = delete;
     TCimXmlWriter& operator=(const TCimXmlWriter&) = delete;
 
-    /// The whole document: CIM, DECLARATION and DECLGROUP with qualifier declarations, classes (superclasses first) and instances
-    /// (class by class in that order, each in order of insertion). `namespaceName` is named in the group where it is not empty,
-    /// with `host` where that is not empty.
+    /// Writes a whole document: CIM, DECLARATION and DECLGROUP with qualifier declarations, classes (superclasses first) and
+    /// instances (class by class in that order, each in order of insertion). The group names `namespaceName` unless it is empty,
+    /// with `host` unless that is empty.
     void WriteNamespace(ICIMNamespace& ns, const std::string& namespaceName = std::string(),
                         const std::string& host = std::string());
 
-    /// The parts, for documents put together by the caller: StartDocument, any number of the others, EndDocument.
+    /// The parts, for callers that choose what to write: StartDocument, any number of the others, EndDocument.
     void StartDocument(const std::string& namespaceName = std::string(), const std::string& host = std::string());
     void WriteQualifierDecl(const ICIMQualifierDecl& decl);
-    /// One VALUE.OBJECT with the CLASS: its own qualifiers, and the properties and methods that it declares itself.
+    /// One VALUE.OBJECT with the CLASS: its own qualifiers, and the properties and methods that it declares itself. A class of
+    /// another host shows inherited ones too; see TCimXmlObjects::FromClass.
     void WriteClass(const ICIMClass& cls);
     /// One VALUE.OBJECT with the INSTANCE; null properties are written without a value.
     void WriteInstance(const ICIMInstance& instance);
-    /// Called again, it offers what the sink has not taken, if anything.
+    /// Writes the end tags and the last piece. If the sink throws, call it again to offer that piece again.
     void EndDocument();
 
     /// The element INSTANCE alone, in one line.

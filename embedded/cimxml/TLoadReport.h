@@ -6,22 +6,22 @@
 
 namespace NORVZEL20 {
 
-/// What a load found. A plain value.
+/// What a load found and added. A plain value.
 struct TLoadReport {
-    /// One kind of oddity that was put up with.
+    /// One kind of oddity that did not end the load.
     struct TTolerated {
-        std::string text;   ///< what was found and how it was taken, with the first place's names
+        std::string text;   ///< what was found and what was made of it, with the names of the first one
         std::size_t line;   ///< the line of the first one, from 1
         std::size_t count;  ///< how many of this kind there were
     };
 
-    std::string namespaceName = "root/cimv2";  ///< the namespace that the document names, or that default
+    std::string namespaceName = "root/cimv2";  ///< the namespace that the document names; this default if it names none
     bool namesNamespace = false;               ///< whether the document names its namespace
-    std::string host;                          ///< the host beside that namespace; empty where none is named
+    std::string host;                          ///< the host beside that namespace; empty if none is named
     std::size_t qualifierDecls = 0;
     std::size_t classes = 0;
     std::size_t instances = 0;
-    std::vector<TTolerated> tolerated;  ///< one entry for each kind, in the order of first appearance
+    std::vector<TTolerated> tolerated;  ///< one entry for each kind, in the order of their first ones
 };
 
 }  // namespace NORVZEL20

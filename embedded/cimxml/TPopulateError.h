@@ -9,11 +9,11 @@ namespace NORVZEL20 {
 
 /// Why a document could not be loaded, and where.
 ///
-/// what() is the whole text for people: `file:line:column: message`, or `file: message` where no place applies.
+/// what() is the whole text for people: `file:line:column: message`, or `file: message` if no place applies.
 /// The status is that of TNamespacePopulator::PopulateFromXMLFile.
 class TPopulateError : public TZELException {
   public:
-    /// `line` and `column` count from 1; 0 for both says that no place applies.
+    /// `line` and `column` count from 1; both are 0 if no place applies.
     TPopulateError(TZELStatusCode status, std::string message, std::string file, std::size_t line, std::size_t column);
     TPopulateError(const TPopulateError& other) = default;
     TPopulateError& operator=(const TPopulateError& other) = default;

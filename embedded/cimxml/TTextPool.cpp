@@ -1,3 +1,12 @@
+// Sharing texts that repeat.
+//
+// Inventories repeat themselves: the same class names, vendors and states stand in thousands of instances. Values can share a text
+// by reference count, so the pool keeps texts to share, in a table of fixed size: the hash of a text selects a bucket, and a bucket
+// keeps one text.
+//
+// The first time a text comes, the bucket only notes its hash. If the next text in that bucket has the same hash, it is taken as
+// repeating and kept, in place of the one before. So texts that are all different cost a hash and no more, and texts that repeat
+// are not pushed out by a single other one. Two texts with the same hash do no harm: the text itself is compared.
 #include "embedded/cimxml/TTextPool.h"
 
 #include <cstdint>
@@ -12,7 +21,7 @@ namespace {
 
 constexpr std::uint64_t kFactor = 0x9e3779b97f4a7c15u;
 
-/// Mixes eight bytes at a time; the last eight overlap what came before. For text of eight bytes and more.
+/// Mixes eight bytes at a time; the last eight overlap those before. The text must have at least eight bytes.
 std::uint64_t HashOf(std::string_view text)
 {
     const auto load = [&](std::size_t position) {

@@ -9,17 +9,17 @@
 
 namespace NORVZEL20 {
 
-/// Makes string values, and lets values of the same text share it: inventories repeat themselves.
+/// Makes string values and lets values of the same text share it, as far as that is cheap.
 ///
-/// Keeps a text from the second time on that it meets it, one in each bucket, so it neither grows nor promises to share; text that
-/// does not repeat passes through without touching what is kept. Not for several threads at once.
+/// The pool keeps a bounded number of texts and does not promise to share. Text that does not repeat replaces nothing in it.
+/// Threads: one at a time. Errors: std::bad_alloc.
 class TTextPool {
   public:
     TCIMValue MakeValue(std::string_view text);
 
   private:
     static constexpr std::size_t kBuckets = 1024;
-    static constexpr std::size_t kLongest = 512;  // longer text hardly repeats
+    static constexpr std::size_t kLongest = 512;  // longer text hardly ever repeats
 
     struct TBucket {
         std::uint32_t hash = 0;  // of the text kept

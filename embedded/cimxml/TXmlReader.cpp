@@ -1,7 +1,18 @@
+// XML over Expat, with limits.
+//
+// Pieces. Bytes may be handed over in pieces of any length, which may end within a tag or a character. Expat keeps what it has not
+// finished and delivers character data in pieces too; the reader gathers those and hands the text over whole, before the next tag.
+//
+// Entities. Expat expands internal entities itself and bounds how much they may amplify the input. It does not see two things: how
+// long attribute defaults become when they are handed out for every element, and how deep expansion recurses on the stack. So the
+// reader adds up defaults and counts declarations. External entities are refused, and no file is ever opened.
+//
+// Exceptions. A C library must not be unwound. A callback catches what the sink throws and stops the parser; Settle throws it again
+// when Expat has returned. Expat may deliver a few events after it was stopped, so each callback checks that first.
 #include "embedded/cimxml/TXmlReader.h"
 
 #ifndef XML_DTD
-#define XML_DTD  // without it the header hides the limits of entity expansion, which the library has
+#define XML_DTD  // without it the header hides functions that the library has, among them the limits of entity expansion
 #endif
 #include <expat.h>
 
@@ -25,7 +36,7 @@ struct TXmlReader::TCallbacks {
     {
         TXmlReader& reader = *static_cast<TXmlReader*>(user);
         if (reader.fStopped) {
-            return;  // the library delivers a few events more after it was told to stop
+            return;
         }
         try {
             action(reader);
@@ -88,7 +99,7 @@ struct TXmlReader::TCallbacks {
         Guarded(user, [](TXmlReader& reader) { reader.Refuse("a document type declaration may not stand here"); });
     }
 
-    /// Entities expand recursively inside the library, so their number bounds its stack.
+    /// Entities expand recursively inside of the library, so their number bounds its stack.
     static void Entity(void* user, const char*, int, const char*, int, const char*, const char*, const char*, const char*) noexcept
     {
         Guarded(user, [](TXmlReader& reader) {
@@ -138,7 +149,7 @@ void TXmlReader::Install()
 
 void TXmlReader::Reset(const char* encoding)
 {
-    // Resetting to an encoding would fall back to the document's own, without a word, where memory is short.
+    // Passing the encoding to the reset would silently fall back to the document's own if memory is short.
     XML_ParserReset(fParser.get(), nullptr);
     if (encoding != nullptr && XML_SetEncoding(fParser.get(), encoding) == XML_STATUS_ERROR) {
         throw std::bad_alloc();
@@ -151,8 +162,7 @@ void TXmlReader::Reset(const char* encoding)
     fStopped = false;
 }
 
-/// Why the attributes are too many or too long; null where they are not. Defaults are declared once and handed out for every
-/// element, which the library's own limit does not see.
+/// Why the attributes are too many or too long; null if they are not.
 const char* TXmlReader::FindExcess(const char** attributes)
 {
     const auto specified = static_cast<std::size_t>(XML_GetSpecifiedAttributeCount(fParser.get()));  // names and values
@@ -211,7 +221,7 @@ bool TXmlReader::ParseBuffer(std::size_t length)
     return Settle(XML_ParseBuffer(fParser.get(), static_cast<int>(length), XML_FALSE) != XML_STATUS_ERROR);
 }
 
-/// Looks at what a call of the library left: a stopped parse, an error of the library, or a tag that goes on too long.
+/// Checks what a call of the library has left: a stopped parse, an error of the library, or a tag that is too long already.
 bool TXmlReader::Settle(bool succeeded)
 {
     if (fException) {
@@ -242,7 +252,7 @@ std::size_t TXmlReader::GetPending() const
 
 void TXmlReader::Stop()
 {
-    fLine = GetLine();  // the library moves on a little when it stops
+    fLine = GetLine();  // the library moves on a little after it is stopped
     fColumn = GetColumn();
     fStopped = true;
     XML_StopParser(fParser.get(), XML_FALSE);

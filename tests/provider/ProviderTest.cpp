@@ -83,7 +83,7 @@ TEST(ProviderTest, TheHostLoadsTheSchemaIntoNamespacesOfInmemAlone)
     const std::string schema = TOSSpecific::GetZELRootPath() + "/data/deltaclasses.properties.xml";
     for (const boost::shared_ptr<ICIMNamespace>& ns : {boost::shared_ptr<ICIMNamespace>(), MakeNamespace(EHost::kPlain, "plain")}) {
         EXPECT_EQ(31, StatusOf([&] { TNamespacePopulator::PopulateFromXMLFile(ns, schema); }));
-        EXPECT_EQ("0|" + schema + ": the namespace is none of the provider \"inmem\", load into one of those|", log.Take());
+        EXPECT_EQ("0|" + schema + ": the namespace is not one of the provider \"inmem\"; load into one of those|", log.Take());
         EXPECT_EQ(11, StatusOf([&] { TNamespacePopulator::PopulateFromXMLFile(ns, schema + ".missing"); }));
         EXPECT_NE("", log.Take());
     }

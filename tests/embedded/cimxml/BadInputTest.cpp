@@ -145,7 +145,7 @@ TEST(CimXmlContextTest, WhatTheNamespaceRefusesEndsTheLoadAtItsPlace)
             return std::to_string(told.GetStatusCode().GetStatus()) + " " + told.what();
         }
     };
-    EXPECT_EQ("13 doc.xml:3:4: found what cannot be taken: Type mismatch", errorOf(TZELException(TZELStatusCode::kTypeMismatch)));
+    EXPECT_EQ("13 doc.xml:3:4: found something that cannot be loaded: Type mismatch", errorOf(TZELException(TZELStatusCode::kTypeMismatch)));
     EXPECT_EQ(5, context.Guard([] { return 5; }));
     try {
         context.Guard([] { throw TPopulateError(TZELStatusCode::kParseError, "told", "other.xml", 1, 2); });
