@@ -18,8 +18,8 @@ TCIMValue::TCIMType TCimXmlAttributes::ReadType(const char* text) const
 
 void TCimXmlAttributes::FailMissing(const char* name) const
 {
-    fContext.Fail(TZELStatusCode::kParseError, std::string("found <") + TCimXmlElement::GetName(fElement) + "> without " + name +
-                                                   ", expected that attribute with a value");
+    fContext.Fail(TZELStatusCode::kParseError, std::string("found <") + TCimXmlElement::GetName(fElement) +
+                                                   "> without the attribute " + name + ", expected it with a value");
 }
 
 }  // namespace NORVZEL20

@@ -100,7 +100,7 @@ void TCimXmlClassMaker::AddQualifiers(TElement& element, const TQualifiers& qual
 {
     if (qualifiers.size() + (inherited != nullptr ? inherited->CountAll() : 0) > TSchemaLimits::kMaxQualifiers) {
         fContext.Fail(EStatus::kParseError, "found more than " + std::to_string(TSchemaLimits::kMaxQualifiers) +
-                                                " qualifiers on one element, inherited ones included; leave some out");
+                                                " qualifiers on one element, inherited ones included; remove some");
     }
     for (const TEmbeddedObject::TQualifier& qualifier : qualifiers) {
         boost::shared_ptr<ICIMQualifier> above;

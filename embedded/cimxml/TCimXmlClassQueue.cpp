@@ -24,7 +24,7 @@ void TCimXmlClassQueue::Add(TCimXmlDraft draft)
     static constexpr TRepetition kInDocument{"repeated class", " is declared again; the first declaration stands",
                                              " a second time, declared differently; remove one of the two"};
     static constexpr TRepetition kInNamespace{"known class", " is in the namespace already, declared the same",
-                                              ", which the namespace declares differently; load into an empty one"};
+                                              ", which the namespace declares differently; load into an empty namespace"};
     const std::string& name = draft.object.GetClassName();
     const auto repeated = fNumbers.find(name);
     if (repeated != fNumbers.end()) {
@@ -145,7 +145,7 @@ void TCimXmlClassQueue::Refuse(const TCimXmlDraft& draft) const
     const std::string& superName = draft.object.GetSuperClassName();
     const std::string found = "found class " + Quote(draft.object.GetClassName()) + " with the superclass " + Quote(superName);
     if (fNumbers.count(superName) > 0) {
-        fContext.Fail(EStatus::kNotFound, found + ", which in the end is below it or below an undeclared class");
+        fContext.Fail(EStatus::kNotFound, found + ", which leads back to it or to a class that is not declared");
     }
     fContext.Fail(EStatus::kNotFound, found + kIsNotDeclared);
 }

@@ -48,14 +48,14 @@ void TCimXmlContext::NoteNamespace(const std::string& name, const std::string& h
     }
     if (!TNameText::Equal(name, fReport.namespaceName)) {
         Fail(TZELStatusCode::kParseError, "found namespace " + Quote(name) + " after " + Quote(fReport.namespaceName) +
-                                              "; one document is one namespace, split this one");
+                                              "; a document holds one namespace, so split this one");
     }
     if (fReport.host.empty()) {
         fReport.host = host;
     }
     if (!host.empty() && !TNameText::Equal(host, fReport.host)) {
         Fail(TZELStatusCode::kParseError,
-             "found host " + Quote(host) + " after " + Quote(fReport.host) + "; one document is one host's, split this one");
+             "found host " + Quote(host) + " after " + Quote(fReport.host) + "; a document comes from one host, so split this one");
     }
 }
 

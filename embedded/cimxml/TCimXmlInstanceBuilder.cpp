@@ -56,7 +56,7 @@ TCimXmlTarget TCimXmlInstanceBuilder::FindProperty(const char* name)
     }
     if (slot == TInMemClass::kNoSlot) {
         fContext.Fail(EStatus::kNotFound, "found property " + Quote(name) + ", but class " + Quote(cls.GetName()) +
-                                              " declares none of that name; add its declaration or correct the name");
+                                              " declares no such property; add its declaration or correct the name");
     }
     if (fLayout->given[slot] == fNumber) {
         fContext.Fail(EStatus::kParseError, DescribeSecondProperty(name, "instance"));

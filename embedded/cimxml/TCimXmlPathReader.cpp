@@ -108,7 +108,7 @@ void TCimXmlPathReader::AddKeyTo(TCIMReference& path, const std::string& name, c
 void TCimXmlPathReader::FailTooDeep() const
 {
     fContext.Fail(EStatus::kParseError,
-                  "found object paths within each other more than " + std::to_string(kMaxDepth) + " deep, expected fewer");
+                  "found object paths nested more than " + std::to_string(kMaxDepth) + " deep, expected fewer levels");
 }
 
 /// The key that a value without a name belongs to: the class must have exactly one.
@@ -153,7 +153,8 @@ void TCimXmlPathReader::AddNamespace(const char* name)
         fNamespaceName += '/';
     }
     if (std::strpbrk(name, ":=\"") != nullptr) {
-        fContext.Fail(EStatus::kParseError, "found namespace " + Quote(name) + ", expected a name without \":=");
+        fContext.Fail(EStatus::kParseError,
+                      "found namespace " + Quote(name) + ", expected a name without colons, equals signs and quotes");
     }
     fNamespaceName += name;
 }
@@ -161,7 +162,7 @@ void TCimXmlPathReader::AddNamespace(const char* name)
 void TCimXmlPathReader::SetHost(std::string_view host)
 {
     if (!fHost.empty() || host.find('/') != std::string_view::npos) {
-        fContext.Fail(EStatus::kParseError, "found host " + Quote(host) + ", expected one, without a slash");
+        fContext.Fail(EStatus::kParseError, "found host " + Quote(host) + ", expected one host, without a slash");
     }
     fHost = host;
 }

@@ -85,7 +85,7 @@ void TCimXmlReader::CheckBlank() const
     }
     if (!std::all_of(fText.begin(), fText.end(), TXmlReader::IsBlank)) {
         fContext.Fail(EStatus::kParseError, "found text " + Quote(fText) + " in <" + TElement::GetName(fOpen.back().element) +
-                                                ">, expected elements alone");
+                                                ">, expected only elements");
     }
 }
 

@@ -96,7 +96,7 @@ struct TXmlReader::TCallbacks {
 
     static void DocumentType(void* user, const char*, const char*, const char*, int) noexcept
     {
-        Guarded(user, [](TXmlReader& reader) { reader.Refuse("a document type declaration may not stand here"); });
+        Guarded(user, [](TXmlReader& reader) { reader.Refuse("a document type declaration is not allowed here"); });
     }
 
     /// Entities expand recursively inside of the library, so their number bounds its stack.

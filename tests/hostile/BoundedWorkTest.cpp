@@ -88,7 +88,7 @@ TEST_F(BoundedWorkTest, AGigabyteOfNestingIsRefusedForItsDepth)
 TEST_F(BoundedWorkTest, AGigabyteOfPathsWithinPathsIsRefusedForItsDepth)
 {
     const std::string path = "<VALUE.REFERENCE>\n<INSTANCENAME CLASSNAME=\"Cable\"><KEYBINDING NAME=\"From\">";
-    EXPECT_EQ("endless.xml:12:57: found object paths within each other more than 12 deep, expected fewer",
+    EXPECT_EQ("endless.xml:12:57: found object paths nested more than 12 deep, expected fewer levels",
               Load(TGeneratedText(kReference, path, kGigabyte / path.size(), "")));
     EXPECT_LE(fPulled, kMegabyte);
     EXPECT_LE(fPeak, 2 * kMegabyte);

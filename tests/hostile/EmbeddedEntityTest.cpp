@@ -56,7 +56,7 @@ std::string LoadWithObject(const std::string& object)
 }
 
 const std::string kRefusal = "in an embedded object: found \"<!DOCTYPE INSTANCE [<!ENTITY ";
-const std::string kReason = "expected an <INSTANCE> or a <CLASS> (a document type declaration may not stand here)";
+const std::string kReason = "expected an <INSTANCE> or a <CLASS> (a document type declaration is not allowed here)";
 
 }  // namespace
 

@@ -46,9 +46,9 @@ const TRow kRows[] = {
     {"misplaced element", L::Group("<VALUE.OBJECT><VALUE/></VALUE.OBJECT>"), 9,
      "doc.xml:2:15: found element <VALUE> in <VALUE.OBJECT>, expected <CLASS>, <INSTANCE>, <CLASSPATH>, <LOCALCLASSPATH>, "
      "<INSTANCEPATH>, <LOCALINSTANCEPATH> or <INSTANCENAME>"},
-    {"text between elements", L::Group(" oops "), 9, "doc.xml:2:7: found text \". oops \" in <DECLGROUP>, expected elements alone"},
+    {"text between elements", L::Group(" oops "), 9, "doc.xml:2:7: found text \". oops \" in <DECLGROUP>, expected only elements"},
     {"no name", L::Group("<VALUE.OBJECT><CLASS/></VALUE.OBJECT>"), 9,
-     "doc.xml:2:15: found <CLASS> without NAME, expected that attribute with a value"},
+     "doc.xml:2:15: found <CLASS> without the attribute NAME, expected it with a value"},
     {"empty object", L::Group("<VALUE.OBJECT></VALUE.OBJECT>"), 9,
      "doc.xml:2:15: found an object without contents, expected a <CLASS> or an <INSTANCE> in it"},
     {"unknown type", L::Group(L::Class("A", "<PROPERTY NAME=\"N\" TYPE=\"uint9\"/>")), 9,
@@ -59,9 +59,9 @@ const TRow kRows[] = {
      "doc.xml:2:15: found class \"A\" with the superclass \"B\", which is not declared; add its <CLASS> to the document or load it "
      "before"},
     {"class below itself", L::Group("<VALUE.OBJECT><CLASS NAME=\"A\" SUPERCLASS=\"a\"/></VALUE.OBJECT>"), 15,
-     "doc.xml:2:15: found class \"A\" with the superclass \"a\", which in the end is below it or below an undeclared class"},
+     "doc.xml:2:15: found class \"A\" with the superclass \"a\", which leads back to it or to a class that is not declared"},
     {"unknown property", L::Group(ClassWithCounter() + L::Instance("A", "1", L::Property("M", "uint8", "1"))), 15,
-     "doc.xml:3:100: found property \"M\", but class \"A\" declares none of that name; add its declaration or correct the name"},
+     "doc.xml:3:100: found property \"M\", but class \"A\" declares no such property; add its declaration or correct the name"},
     {"second instance", L::Group(ClassWithCounter() + L::Instance("A", "1") + L::Instance("A", "1")), 12,
      "doc.xml:4:100: found a second instance root/cimv2:A.Id=\"1\"; instances of class \"A\" must differ in their keys"},
     {"key without value", L::Group(ClassWithCounter() + "<INSTANCE CLASSNAME=\"A\"/>"), 14,
@@ -81,7 +81,7 @@ const TRow kRows[] = {
     {"two namespaces",
      L::Group("<LOCALNAMESPACEPATH><NAMESPACE NAME=\"a\"/></LOCALNAMESPACEPATH>\n"
               "<LOCALNAMESPACEPATH><NAMESPACE NAME=\"b\"/></LOCALNAMESPACEPATH>\n"),
-     9, "doc.xml:3:42: found namespace \"b\" after \"a\"; one document is one namespace, split this one"},
+     9, "doc.xml:3:42: found namespace \"b\" after \"a\"; a document holds one namespace, so split this one"},
 };
 
 TEST(BadInputTest, EachGetsOneMessageAndLeavesNothing)
@@ -145,7 +145,8 @@ TEST(CimXmlContextTest, WhatTheNamespaceRefusesEndsTheLoadAtItsPlace)
             return std::to_string(told.GetStatusCode().GetStatus()) + " " + told.what();
         }
     };
-    EXPECT_EQ("13 doc.xml:3:4: found something that cannot be loaded: Type mismatch", errorOf(TZELException(TZELStatusCode::kTypeMismatch)));
+    EXPECT_EQ("13 doc.xml:3:4: found something that cannot be loaded: Type mismatch",
+              errorOf(TZELException(TZELStatusCode::kTypeMismatch)));
     EXPECT_EQ(5, context.Guard([] { return 5; }));
     try {
         context.Guard([] { throw TPopulateError(TZELStatusCode::kParseError, "told", "other.xml", 1, 2); });

@@ -104,7 +104,7 @@ TEST(LimitsTest, AsManyLoadAndOneMoreIsRefused)
          "found more than 1024 qualifiers on one element in class \"A\"; split it"},
         {"with inherited ones", Class("A", Marked(512)) + Class("B", Marked(512), "A"),
          Class("A", Marked(512)) + Class("B", Marked(513, 100), "A"),
-         "found more than 1024 qualifiers on one element, inherited ones included; leave some out"},
+         "found more than 1024 qualifiers on one element, inherited ones included; remove some"},
         {"key bindings of a path", Path(256), Path(257), "found more than 256 key bindings in one path"},
     };
     for (const TRow& row : rows) {

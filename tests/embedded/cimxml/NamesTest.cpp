@@ -74,9 +74,10 @@ TEST(NamesTest, ANamespaceAndAHostHoldNothingOfThatEither)
                "\"/></LOCALNAMESPACEPATH></NAMESPACEPATH>" + Name("E", Key("Id", kOne)) + "</INSTANCEPATH>";
     };
     EXPECT_EQ("", ErrorOfPath(path("<HOST>[::1]:5989</HOST>", "root/cimv2")));
-    EXPECT_EQ("found namespace \"a:b\", expected a name without \":=", ErrorOfPath(path("<HOST>h</HOST>", "a:b")));
-    EXPECT_EQ("found host \"h/x\", expected one, without a slash", ErrorOfPath(path("<HOST>h/x</HOST>", "root")));
-    EXPECT_EQ("found host \"i\", expected one, without a slash", ErrorOfPath(path("<HOST>h</HOST><HOST>i</HOST>", "root")));
+    EXPECT_EQ("found namespace \"a:b\", expected a name without colons, equals signs and quotes",
+              ErrorOfPath(path("<HOST>h</HOST>", "a:b")));
+    EXPECT_EQ("found host \"h/x\", expected one host, without a slash", ErrorOfPath(path("<HOST>h/x</HOST>", "root")));
+    EXPECT_EQ("found host \"i\", expected one host, without a slash", ErrorOfPath(path("<HOST>h</HOST><HOST>i</HOST>", "root")));
     const std::string space = "<LOCALNAMESPACEPATH><NAMESPACE NAME=\"x\"/></LOCALNAMESPACEPATH>";
     EXPECT_EQ("found a second namespace in one path, expected one",
               ErrorOfPath("<LOCALCLASSPATH>" + space + space + "<CLASSNAME NAME=\"E\"/></LOCALCLASSPATH>"));
@@ -101,7 +102,7 @@ TEST(NamesTest, PathsWithinPathsEndSomewhere)
         }
         return path;
     };
-    const std::string refused = "found object paths within each other more than 12 deep, expected fewer";
+    const std::string refused = "found object paths nested more than 12 deep, expected fewer levels";
     EXPECT_EQ("", ErrorOfPath(nest("Other", 10)));
     EXPECT_EQ(refused, ErrorOfPath(nest("Other", 11)));
     EXPECT_EQ(refused, ErrorOfPath(nest("E", 40)));  // whose key is text: each level would double it

@@ -165,7 +165,7 @@ TEST_F(PopulatorTest, AClassThatIsThereAlreadyIsToleratedWhereItIsTheSame)
     fLoading.Load(L::Group(L::Class("A", kPropertyS)));
     const TLoadReport report = fLoading.Load(L::Group(L::Class("A", kPropertyS) + L::Instance("A", "1")));
     EXPECT_EQ("2: class \"A\" is in the namespace already, declared the same (1)\n", L::Tolerated(report));
-    EXPECT_EQ("doc.xml:2:15: found class \"A\", which the namespace declares differently; load into an empty one",
+    EXPECT_EQ("doc.xml:2:15: found class \"A\", which the namespace declares differently; load into an empty namespace",
               fLoading.ErrorOf(L::Group(L::Class("A"))));
 }
 
