@@ -2,7 +2,9 @@
 
 #include <algorithm>
 
-#include "client/inventory/CollectObjects.h"
+#include "client/inventory/CimWalk.h"
+#include "client/inventory/OperatingSystem.h"
+#include "embedded/value/TValueXml.h"
 #include "host/RootClassName.h"
 #include "provider/DeltaNames.h"
 
@@ -10,30 +12,12 @@ namespace NORVZEL20 {
 
 namespace {
 
-std::string EscapeAttribute(const std::string& text)
-{
-    std::string escaped;
-    for (const char character : text) {
-        switch (character) {
-        case '&':
-            escaped += "&amp;";
-            break;
-        case '<':
-            escaped += "&lt;";
-            break;
-        case '"':
-            escaped += "&quot;";
-            break;
-        default:
-            escaped += character;
-        }
-    }
-    return escaped;
-}
-
 std::string Element(const std::string& className, const char* treatment)
 {
-    return "  <class name=\"" + EscapeAttribute(className) + "\" default=\"" + treatment + "\"/>\n";
+    std::string element = "  <class";
+    TValueXml::AppendAttribute(element, "name", className);
+    TValueXml::AppendAttribute(element, "default", treatment);
+    return element + "/>\n";
 }
 
 bool IsMade(const std::vector<TSchemaNote>& notes)
