@@ -1,3 +1,11 @@
+// From the draft of a class to the class.
+//
+// Two kinds of documents exist. Some list only what a class itself declares; others repeat what it inherits, marked PROPAGATED.
+// Both must give the same class, so a part that is marked and that the superclass has is left out. The mark alone is not enough:
+// a part that is marked but that no superclass declares would otherwise be lost.
+//
+// Names are checked here, because here they become part of paths. Limits are checked with inherited parts included, which a draft
+// cannot know: every instance of every subclass has room for each property.
 #include "embedded/cimxml/TCimXmlClassMaker.h"
 
 #include <boost/smart_ptr/make_shared.hpp>
@@ -48,6 +56,12 @@ void TCimXmlClassMaker::FailTooMany(std::size_t most, const char* what, const st
                                             ", inherited ones included; split it");
 }
 
+void TCimXmlClassMaker::FailSecond(const char* what, const std::string& name, const TInMemClass& cls) const
+{
+    fContext.Fail(EStatus::kParseError,
+                  std::string("found a second declaration of ") + what + " " + Quote(name) + " in class " + Quote(cls.GetName()));
+}
+
 void TCimXmlClassMaker::AddProperty(TInMemClass& cls, const TEmbeddedObject::TProperty& property, const TInMemClass* super)
 {
     fContext.CheckName("property", property.fName);
@@ -68,8 +82,7 @@ void TCimXmlClassMaker::AddProperty(TInMemClass& cls, const TEmbeddedObject::TPr
     decl->SetArraySize(property.fArraySize);
     AddQualifiers(*decl, property.fQualifiers, inherited ? &inherited->GetQualifiers() : nullptr);
     if (!cls.AddPropertyDecl(decl)) {
-        fContext.Fail(EStatus::kParseError,
-                      "found a second declaration of property " + Quote(property.fName) + " in class " + Quote(cls.GetName()));
+        FailSecond("property", property.fName, cls);
     }
 }
 
@@ -90,8 +103,7 @@ void TCimXmlClassMaker::AddMethod(TInMemClass& cls, const TEmbeddedObject::TMeth
     }
     AddQualifiers(*decl, method.fQualifiers, inherited ? &inherited->GetQualifiers() : nullptr);
     if (!cls.AddMethodDecl(decl)) {
-        fContext.Fail(EStatus::kParseError,
-                      "found a second declaration of method " + Quote(method.fName) + " in class " + Quote(cls.GetName()));
+        FailSecond("method", method.fName, cls);
     }
 }
 

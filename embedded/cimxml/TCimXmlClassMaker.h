@@ -29,6 +29,7 @@ class TCimXmlClassMaker {
     template <class TElement>
     void AddQualifiers(TElement& element, const TQualifiers& qualifiers, const TInMemQualifierSet* inherited);
     [[noreturn]] void FailTooMany(std::size_t most, const char* what, const std::string& className) const;
+    [[noreturn]] void FailSecond(const char* what, const std::string& name, const TInMemClass& cls) const;
     void NoteQualifier(const TEmbeddedObject::TQualifier& qualifier, const ICIMQualifier* inherited);
     void AddProperty(TInMemClass& cls, const TEmbeddedObject::TProperty& property, const TInMemClass* super);
     void AddMethod(TInMemClass& cls, const TEmbeddedObject::TMethod& method, const TInMemClass* super);

@@ -59,6 +59,7 @@ void TCimXmlContext::NoteNamespace(const std::string& name, const std::string& h
     }
 }
 
+/// A host that is not named counts as the same, because many writers leave it out.
 bool TCimXmlContext::IsOwn(const std::string& name, const std::string& host) const
 {
     if (!TNameText::Equal(name, fReport.namespaceName)) {
@@ -67,6 +68,7 @@ bool TCimXmlContext::IsOwn(const std::string& name, const std::string& host) con
     return host.empty() || fReport.host.empty() || TNameText::Equal(host, fReport.host);
 }
 
+/// Other characters, such as a dot, a comma or a colon, could make two different paths read the same.
 void TCimXmlContext::CheckName(const char* what, std::string_view name) const
 {
     const auto isPart = [](char c) {

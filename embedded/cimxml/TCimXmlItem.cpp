@@ -44,6 +44,7 @@ void TCimXmlItem::Parse(std::string_view text, TCIMValue& value)
     }
 }
 
+/// Without a mark in the document, the declaration allows plain text too, so the text itself has to decide.
 bool TCimXmlItem::IsObject(std::string_view text) const
 {
     if (fText == kPerhapsObject) {

@@ -43,6 +43,7 @@ void TCimXmlQualifierReader::BeginDecl(const TCimXmlAttributes& attributes)
     fScope = 0;
 }
 
+/// No DTD has ANY, but some writers use it.
 void TCimXmlQualifierReader::ReadScope(const TCimXmlAttributes& attributes)
 {
     for (const TCimXmlFlag& flag : kCimXmlScopes) {

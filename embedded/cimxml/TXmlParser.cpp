@@ -27,6 +27,7 @@ class TXmlParser::TEvents : public TXmlReader::ISink {
         fParser.EndElement(name);
     }
 
+    /// The parser gets text when it asks for it, at the latest before the next tag.
     void OnText(const char* text, std::size_t length) override
     {
         fText = text;
@@ -65,7 +66,7 @@ class TXmlParser::TEvents : public TXmlReader::ISink {
     TXmlParser& fParser;
     TXmlReader fReader;
     std::map<std::string, std::string> fAttributes;
-    const char* fText = nullptr;
+    const char* fText = nullptr;  // not handed over yet; the reader keeps it until the next tag
     std::size_t fLength = 0;
 };
 
