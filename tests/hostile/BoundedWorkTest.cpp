@@ -1,8 +1,9 @@
-// Documents that never end: how much of them is read, and how much memory that takes, is counted.
+// Documents without end: the bytes read and the memory taken are counted.
 #include <gmock/gmock.h>
 
 #include "embedded/cimxml/TCimXmlPopulator.h"
 #include "fuzz/SampleInventory.h"
+#include "tests/hostile/DocumentParts.h"
 #include "tests/hostile/TGeneratedText.h"
 #include "tests/hostile/TMemoryMeter.h"
 
@@ -10,17 +11,15 @@ namespace NORVZEL20 {
 
 namespace {
 
-constexpr std::uint64_t kMegabyte = 1u << 20;
 constexpr std::uint64_t kGigabyte = 1024 * kMegabyte;
 
-const std::string kGroup = "<CIM CIMVERSION=\"2.0\" DTDVERSION=\"2.0\"><DECLARATION><DECLGROUP>";
 const std::string kValue = kGroup + "<VALUE.OBJECT><INSTANCE CLASSNAME=\"Device\"><PROPERTY NAME=\"Id\" TYPE=\"string\"><VALUE>";
 
 const std::string kReference = kGroup + "<VALUE.OBJECT><INSTANCE CLASSNAME=\"Cable\"><PROPERTY.REFERENCE NAME=\"From\">";
 const std::string kArray =
     kGroup + "<VALUE.OBJECT><INSTANCE CLASSNAME=\"Disk\"><PROPERTY.ARRAY NAME=\"Labels\" TYPE=\"string\"><VALUE.ARRAY>";
 
-/// Loads generated documents and looks at the cost.
+/// Loads generated documents and measures the cost.
 class BoundedWorkTest : public testing::Test {
   protected:
     std::string Load(TGeneratedText text)
@@ -73,7 +72,7 @@ TEST_F(BoundedWorkTest, ANameOfAGigabyteIsRefusedAtItsLimit)
     EXPECT_LE(fPeak, 100 * kMegabyte);
 }
 
-/// What a recorded response returns from a method is read over, whatever it is.
+/// The return value of a method in a recorded response is skipped, whatever it is.
 TEST_F(BoundedWorkTest, AGigabyteOfNestingIsRefusedForItsDepth)
 {
     const std::string response = "<CIM CIMVERSION=\"2.0\" DTDVERSION=\"2.0\"><MESSAGE ID=\"1\" PROTOCOLVERSION=\"1.0\"><SIMPLERSP>"
@@ -84,7 +83,7 @@ TEST_F(BoundedWorkTest, AGigabyteOfNestingIsRefusedForItsDepth)
     EXPECT_LE(fPeak, 4 * kMegabyte);
 }
 
-/// Keys may be paths, whose keys may be paths: text of such a path doubles its escapes with each.
+/// Keys may be paths, whose keys may be paths: the escapes in the text of such a path double with each level.
 TEST_F(BoundedWorkTest, AGigabyteOfPathsWithinPathsIsRefusedForItsDepth)
 {
     const std::string path = "<VALUE.REFERENCE>\n<INSTANCENAME CLASSNAME=\"Cable\"><KEYBINDING NAME=\"From\">";
@@ -94,7 +93,7 @@ TEST_F(BoundedWorkTest, AGigabyteOfPathsWithinPathsIsRefusedForItsDepth)
     EXPECT_LE(fPeak, 2 * kMegabyte);
 }
 
-TEST_F(BoundedWorkTest, PathsWithinPathsUpToTheLimitAreLoadedAndTold)
+TEST_F(BoundedWorkTest, PathsWithinPathsUpToTheLimitAreLoadedAndWritten)
 {
     std::string beginning = kReference;
     std::string end = "<KEYVALUE>x</KEYVALUE>";
@@ -123,7 +122,7 @@ TEST_F(BoundedWorkTest, AGigabyteOfElementsInTheWrongPlaceIsRefusedAtOnce)
     EXPECT_LE(fPeak, 16 * kMegabyte);
 }
 
-/// Comments between elements are read and forgotten.
+/// Comments between elements are not kept.
 TEST_F(BoundedWorkTest, MuchOfNothingTakesNoMemory)
 {
     EXPECT_EQ("loaded", Load(TGeneratedText(kGroup, "<!-- nothing -->\n", 4 * kMegabyte, "</DECLGROUP></DECLARATION></CIM>")));

@@ -1,4 +1,4 @@
-// Small files that unpack to far more: the client reads them no further than the XML reader lets it.
+// Small files that unpack to far more: the client stops where the XML reader refuses.
 #include <archive.h>
 #include <archive_entry.h>
 #include <gtest/gtest.h>
@@ -9,6 +9,7 @@
 
 #include "client/CommandLine.h"
 #include "tests/client/TFakeConsole.h"
+#include "tests/hostile/DocumentParts.h"
 #include "tests/hostile/TGeneratedText.h"
 #include "tests/hostile/TMemoryMeter.h"
 #include "tests/hostile/TScanMeter.h"
@@ -18,13 +19,9 @@ namespace NORVZEL20 {
 
 namespace {
 
-constexpr std::uint64_t kMegabyte = 1u << 20;
-
-const std::string kGroup = "<CIM CIMVERSION=\"2.0\" DTDVERSION=\"2.0\"><DECLARATION><DECLGROUP>";
-const std::string kEnd = "</DECLGROUP></DECLARATION></CIM>\n";
 const std::string kText = kGroup + "<VALUE.OBJECT><CLASS NAME=\"C\"><PROPERTY NAME=\"P\" TYPE=\"string\"><VALUE>";
 
-/// Compressed text, made on the way to its file.
+/// A file of compressed text, written without holding the text.
 class TBomb {
   public:
     TBomb(TGeneratedText text, int filter) : fFile("")
@@ -38,8 +35,9 @@ class TBomb {
         Check(archive_write_open_filename(writer.get(), GetPath().c_str()));
         Check(archive_write_header(writer.get(), entry.get()));
         std::vector<char> piece(kMegabyte);
-        while (const std::size_t length = text.Pull(piece.data(), piece.size()))
+        while (const std::size_t length = text.Pull(piece.data(), piece.size())) {
             EXPECT_EQ(static_cast<la_ssize_t>(length), archive_write_data(writer.get(), piece.data(), length));
+        }
         Check(archive_write_close(writer.get()));
     }
 
@@ -52,7 +50,7 @@ class TBomb {
     TScratchFile fFile;
 };
 
-/// Shows bombs to the client, and looks at what they cost.
+/// Runs the client on bombs and measures the cost.
 class CompressedBombTest : public testing::TestWithParam<int> {
   protected:
     std::string Show(const TBomb& bomb)
@@ -65,8 +63,9 @@ class CompressedBombTest : public testing::TestWithParam<int> {
         fPeak = memory.GetPeak();
         fGiven = scan.GetGiven();
         const std::size_t path = console.fErr.find(bomb.GetPath());
-        if (path != std::string::npos)
+        if (path != std::string::npos) {
             console.fErr.replace(path, bomb.GetPath().size(), "BOMB");
+        }
         return "status " + std::to_string(status) + "\n" + console.fOut + console.fErr;
     }
 
@@ -96,7 +95,7 @@ TEST_P(CompressedBombTest, ATagThatUnpacksWithoutEndIsRefusedAtItsLimit)
     EXPECT_LE(fPeak, 100 * kMegabyte);
 }
 
-/// What is read over may be long; nothing of it is kept.
+/// Comments may be long; nothing of them is kept.
 TEST_P(CompressedBombTest, MuchOfNothingTakesLittleMemory)
 {
     const TBomb bomb(TGeneratedText(kGroup, "<!-- nothing -->\n", 64 * kMegabyte / 17, kEnd), GetParam());

@@ -7,13 +7,18 @@ namespace NORVZEL20 {
 
 constexpr std::size_t kMegabyte = 1u << 20;
 
-/// The text so many times, without a break.
+/// The beginning and the end of an inventory, around the contents of its group.
+inline const std::string kGroup = "<CIM CIMVERSION=\"2.0\" DTDVERSION=\"2.0\"><DECLARATION><DECLGROUP>";
+inline const std::string kEnd = "</DECLGROUP></DECLARATION></CIM>";
+
+/// The text that many times, without a break.
 inline std::string Repeat(const std::string& unit, std::size_t times)
 {
     std::string text;
     text.reserve(unit.size() * times);
-    for (std::size_t i = 0; i < times; ++i)
+    for (std::size_t i = 0; i < times; ++i) {
         text += unit;
+    }
     return text;
 }
 

@@ -1,11 +1,11 @@
-// Embedded objects are documents of their own within a document, each of which might declare entities.
+// Embedded objects are documents inside of a document, and each might declare entities.
 #include <gtest/gtest.h>
 
 #include <algorithm>
 
 #include "embedded/cimxml/TCimXmlPopulator.h"
 #include "embedded/store/TInMemNamespace.h"
-#include "tests/hostile/Repeat.h"
+#include "tests/hostile/DocumentParts.h"
 #include "tests/hostile/TMemoryMeter.h"
 
 namespace NORVZEL20 {
@@ -15,8 +15,9 @@ namespace {
 std::string Escape(const std::string& text)
 {
     std::string escaped;
-    for (const char c : text)
+    for (const char c : text) {
         escaped += c == '<' ? "&lt;" : c == '&' ? "&amp;" : c == '"' ? "&#34;" : std::string(1, c);
+    }
     return escaped;
 }
 

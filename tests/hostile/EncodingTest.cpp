@@ -1,4 +1,4 @@
-// Bytes that are no text, and text in other encodings than it says.
+// Bytes that are no text, and text in another encoding than it declares.
 #include <gmock/gmock.h>
 
 #include "tests/hostile/HostileRow.h"
@@ -10,16 +10,18 @@ namespace {
 std::string BigEndian(const std::string& text)
 {
     std::string wide;
-    for (const char unit : text)
+    for (const char unit : text) {
         wide += std::string(1, '\0') + unit;
+    }
     return wide;
 }
 
 std::string LittleEndian(const std::string& text)
 {
     std::string wide;
-    for (const char unit : text)
+    for (const char unit : text) {
         wide += std::string(1, unit) + '\0';
+    }
     return wide;
 }
 
@@ -84,8 +86,8 @@ TEST(EncodingTest, HalfACharacterIsRefused)
 TEST(EncodingTest, HalfASurrogatePairIsRefusedOrReadAsOneCharacter)
 {
     const auto row = Refused("half a surrogate pair", {"", "Id", WithLoneSurrogate}, 1, "not well-formed (invalid token)");
-    EXPECT_THAT(row.document.ReadByParser().told, testing::AnyOf(row.parser, "1 elements, text '\xF0\x90\x91\xA4'"));
-    EXPECT_THAT(row.document.LoadByPopulator().told, testing::AnyOf(row.populator, "loaded '\xF0\x90\x91\xA4'"));
+    EXPECT_THAT(row.document.ReadByParser().outcome, testing::AnyOf(row.parser, "1 elements, text '\xF0\x90\x91\xA4'"));
+    EXPECT_THAT(row.document.LoadByPopulator().outcome, testing::AnyOf(row.populator, "loaded '\xF0\x90\x91\xA4'"));
 }
 
 TEST(EncodingTest, WrongDeclarationsAreRefused)
@@ -95,7 +97,7 @@ TEST(EncodingTest, WrongDeclarationsAreRefused)
     ExpectOutcomes({RefusedAt("UTF-8 that says UTF-16", {declared + "UTF-16\"?>", "Id"}, 31, contradicts),
                     RefusedAt("UTF-16 that says UTF-8", {declared + "UTF-8\"?>", "Id", MarkedLittleEndian}, 32, contradicts),
                     RefusedAt("an encoding that is not read", {declared + "UTF-32\"?>", "Id"}, 31, "unknown encoding"),
-                    RefusedAt("an encoding that nobody knows", {declared + "nobody\"?>", "Id"}, 31, "unknown encoding")});
+                    RefusedAt("an encoding that does not exist", {declared + "nobody\"?>", "Id"}, 31, "unknown encoding")});
 }
 
 TEST(EncodingTest, InvalidUtf8IsRefused)

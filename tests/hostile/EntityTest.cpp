@@ -1,6 +1,6 @@
-// Documents that expand to far more than they are: entities within entities, long entities often used, entities without end.
+// Documents that expand to far more than their size: entities of entities, long entities used often, entities without end.
+#include "tests/hostile/DocumentParts.h"
 #include "tests/hostile/HostileRow.h"
-#include "tests/hostile/Repeat.h"
 
 namespace NORVZEL20 {
 
@@ -10,8 +10,9 @@ namespace {
 THostileDocument BillionLaughs(const std::string& content)
 {
     std::string prolog = "<!DOCTYPE r [<!ENTITY e0 \"0123456789\">";
-    for (int level = 1; level < 10; ++level)
+    for (int level = 1; level < 10; ++level) {
         prolog += "<!ENTITY e" + std::to_string(level) + " \"" + Repeat("&e" + std::to_string(level - 1) + ";", 10) + "\">";
+    }
     return {prolog + "]>", content};
 }
 
@@ -23,20 +24,22 @@ THostileDocument QuadraticBlowUp(const std::string& content)
 
 const std::string kReferences = Repeat("&e;", 1000);
 
-/// Parameter entities expand within the declarations.
+/// Parameter entities expand in the declarations.
 THostileDocument ParameterBomb()
 {
     std::string prolog = "<!DOCTYPE r [<!ENTITY % p0 \"<!-- 0123456789 -->\">";
-    for (int level = 1; level < 10; ++level)
+    for (int level = 1; level < 10; ++level) {
         prolog += "<!ENTITY % p" + std::to_string(level) + " \"" + Repeat("&#37;p" + std::to_string(level - 1) + ";", 10) + "\">";
+    }
     return {prolog + "%p9;]>", "Id"};
 }
 
 THostileDocument ManyEntities()
 {
     std::string prolog = "<!DOCTYPE r [";
-    for (int i = 0; i < 1001; ++i)
+    for (int i = 0; i < 1001; ++i) {
         prolog += "<!ENTITY e" + std::to_string(i) + " \"v\">";
+    }
     return {prolog + "]>", "Id"};
 }
 
@@ -51,11 +54,11 @@ TEST(EntityTest, BombsAreRefused)
         Refused("an entity of itself", {"<!DOCTYPE r [<!ENTITY e \"&f;\"><!ENTITY f \"&e;\">]>", "&e;"}, 0,
                 "recursive entity reference"),
         RefusedAt("too many declarations", ManyEntities(), 17919, "too many entity declarations"),
-        Refused("an entity that nobody declared", {"", "&nobody;"}, 0, "undefined entity"),
+        Refused("an undeclared entity", {"", "&nobody;"}, 0, "undefined entity"),
     });
 }
 
-/// The library puts an attribute's value together before anybody sees its element.
+/// The library puts an attribute's value together before it reports the element.
 TEST(EntityTest, BombsInAttributesAreRefused)
 {
     const std::string reason = "limit on input amplification factor (from DTD and entities) breached";
@@ -64,7 +67,7 @@ TEST(EntityTest, BombsInAttributesAreRefused)
         Within(16 * kMegabyte, Refused("billion laughs", BillionLaughs("<a b='&e9;'/>"), 0, reason)),
         Within(16 * kMegabyte, Refused("one long entity often", QuadraticBlowUp("<a b='" + kReferences + "'/>"), 0, reason)),
         Refused("an entity of itself", {recursive, "<a b='&e;'/>"}, 0, "recursive entity reference"),
-        Refused("an entity that nobody declared", {"", "<a b='&nobody;'/>"}, 0, "undefined entity"),
+        Refused("an undeclared entity", {"", "<a b='&nobody;'/>"}, 0, "undefined entity"),
     });
 }
 
@@ -74,7 +77,7 @@ TEST(EntityTest, ParameterBombsAreNotLit)
     ExpectOutcomes({Handled("parameter entities", ParameterBomb())});
 }
 
-/// What an honest writer uses stays usable.
+/// The limits must not hit what honest writers use.
 TEST(EntityTest, ModestEntitiesAreReplaced)
 {
     ExpectOutcomes({Handled("an entity", {"<!DOCTYPE r [<!ENTITY i \"I&#100;\">]>", "&i;"}),

@@ -1,4 +1,4 @@
-// External entities and DTDs are never opened: the kernel is asked whether anybody touched the file.
+// External entities and DTDs are never opened: the kernel reports every access to the file.
 #include <sys/inotify.h>
 #include <unistd.h>
 
@@ -12,7 +12,7 @@ namespace NORVZEL20 {
 
 namespace {
 
-/// A file whose every opening and reading is noticed.
+/// A file for which the kernel reports every opening and reading.
 class ExternalEntityTest : public testing::Test {
   protected:
     void SetUp() override
@@ -35,13 +35,14 @@ class ExternalEntityTest : public testing::Test {
         std::filesystem::remove_all(fFolder);
     }
 
-    /// Whether somebody opened or read the file since the last call.
+    /// Whether the file was opened or read since the last call.
     bool WasTouched()
     {
         char events[4096];
         bool touched = false;
-        while (read(fNotify, events, sizeof events) > 0)
+        while (read(fNotify, events, sizeof events) > 0) {
             touched = true;
+        }
         return touched;
     }
 

@@ -9,29 +9,28 @@
 
 namespace NORVZEL20 {
 
-/// What reading a document of a few lines may take.
+/// The memory that reading a document of a few lines may take.
 constexpr std::size_t kSmallBound = 256 * 1024;
 
-/// A hostile document, and what each reader must make of it.
+/// A hostile document and the outcome that each reader must have (see THostileDocument).
 struct THostileRow {
     std::string name;
     THostileDocument document;
     std::string parser;
     std::string populator;
     std::string specification;
-    std::size_t bound = kSmallBound;  ///< bytes that any of the readers may hold at a time
+    std::size_t bound = kSmallBound;  ///< bytes that a reader may hold at a time
 };
 
-/// Readers free as they go, so that all they ever allocate is a small multiple of what they hold at a time.
-inline void ExpectReading(const std::string& told, std::size_t bound, const TReading& reading)
+/// A reader may allocate in total only a small multiple of what it may hold at a time.
+inline void ExpectReading(const std::string& outcome, std::size_t bound, const TReading& reading)
 {
-    EXPECT_EQ(told, reading.told);
+    EXPECT_EQ(outcome, reading.outcome);
     EXPECT_LE(reading.peak, bound);
     EXPECT_LE(reading.total, 4 * bound);
 }
 
-/// Shows every row to every reader, and looks at what each makes of it and at the memory that takes; the name of a row that fails
-/// is printed.
+/// Runs every reader on every row and checks outcome and memory. If a row fails, its name is printed.
 inline void ExpectOutcomes(const std::vector<THostileRow>& rows)
 {
     for (const THostileRow& row : rows) {
@@ -42,10 +41,10 @@ inline void ExpectOutcomes(const std::vector<THostileRow>& rows)
     }
 }
 
-/// The column of an inventory where the content begins when nothing stands before its element.
+/// The column at which the content of an inventory begins if there is no prolog.
 constexpr std::size_t kContentColumn = 148;
 
-/// A row for what no reader accepts, for one reason: a plain error of the document, in its first line.
+/// A row for a document that all readers refuse for the same reason, in its first line at `column` of the inventory.
 inline THostileRow RefusedAt(const std::string& name, const THostileDocument& document, std::size_t column,
                              const std::string& reason)
 {
@@ -53,20 +52,20 @@ inline THostileRow RefusedAt(const std::string& name, const THostileDocument& do
             "status 9\nDiff-XML Parser line 1:" + reason};
 }
 
-/// The same where the trouble begins so many characters behind the beginning of the content.
+/// The same, with the place as an offset from the beginning of the content.
 inline THostileRow Refused(const std::string& name, const THostileDocument& document, std::size_t offset, const std::string& reason)
 {
     return RefusedAt(name, document, document.prolog.size() + kContentColumn + offset, reason);
 }
 
-/// The row with another bound on memory.
+/// The row with another bound on memory, in bytes.
 inline THostileRow Within(std::size_t bound, THostileRow row)
 {
     row.bound = bound;
     return row;
 }
 
-/// A row for a harmless content, whatever stands before it.
+/// A row for a document that all readers accept, with "Id" as its content.
 inline THostileRow Handled(const std::string& name, const THostileDocument& document)
 {
     return {name, document, "1 elements, text 'Id'", "loaded 'Id'", "rules for 'Id'"};

@@ -1,4 +1,4 @@
-// Documents that would have the loader do the same again and again: its steps are counted.
+// Documents that could make the loader repeat work for each instance or class: its steps are counted.
 #include <gtest/gtest.h>
 
 #include "embedded/cimxml/TCimXmlLoader.h"
@@ -15,7 +15,7 @@ struct TNoSink : TXmlReader::ISink {
     void OnText(const char*, std::size_t) override {}
 };
 
-/// A loader that is told classes and instances as a document would tell them.
+/// A loader that gets classes and instances one after the other, as from a document.
 class LoaderWorkTest : public testing::Test {
   protected:
     LoaderWorkTest() { fContext.SetReader(fXml); }
@@ -63,8 +63,9 @@ TEST_F(LoaderWorkTest, ClassesBetweenInstancesAreTriedOnce)
 
 TEST_F(LoaderWorkTest, ClassesThatWaitForTheirSuperclassAreNotTriedAgainForEachInstance)
 {
-    for (std::size_t number = 0; number < kMany; ++number)
+    for (std::size_t number = 0; number < kMany; ++number) {
         Class("Waiting" + Name(number), "Late");
+    }
     for (std::size_t number = 0; number < kMany; ++number) {
         Class(Name(number));
         EXPECT_TRUE(Instance(Name(number)));
@@ -78,21 +79,24 @@ TEST_F(LoaderWorkTest, ClassesThatWaitForTheirSuperclassAreNotTriedAgainForEachI
 
 TEST_F(LoaderWorkTest, ALongChainWithoutATopIsGoneOverOnce)
 {
-    for (std::size_t number = kMany; number > 0; --number)
+    for (std::size_t number = kMany; number > 0; --number) {
         Class(Name(number), Name(number - 1));
+    }
     EXPECT_THROW(Finish(), TPopulateError);
     EXPECT_LE(fLoader.CountTried(), 4 * kMany);
 }
 
-/// So a failed load takes back what it added, last things first.
+/// A failed load takes back what it added in reverse order.
 TEST(EraseLastTest, TheLastElementIsFoundAtOnce)
 {
     std::vector<int> list;
-    for (int number = 0; number < 100; ++number)
+    for (int number = 0; number < 100; ++number) {
         list.push_back(number);
+    }
     std::size_t asked = 0;
-    for (int number = 99; number >= 10; --number)
+    for (int number = 99; number >= 10; --number) {
         EraseLast(list, [&](int other) { return ++asked > 0 && other == number; });
+    }
     EXPECT_EQ(90U, asked);
     EXPECT_EQ(10U, list.size());
     EraseLast(list, [](int other) { return other % 2 == 0; });

@@ -1,4 +1,4 @@
-// The meter itself: bounds from above would all hold if nothing were counted.
+// The meter itself: if it counted nothing, all upper bounds would hold.
 #include <gtest/gtest.h>
 #include <malloc.h>
 
@@ -9,13 +9,13 @@
 
 #include "embedded/cimxml/TCimXmlPopulator.h"
 #include "fuzz/SampleInventory.h"
+#include "tests/hostile/DocumentParts.h"
 #include "tests/hostile/TMemoryMeter.h"
 
 namespace NORVZEL20 {
 
 namespace {
 
-constexpr std::size_t kMegabyte = 1u << 20;
 constexpr std::size_t kMuch = 10 * kMegabyte;
 
 struct alignas(4096) TPage {
@@ -91,7 +91,7 @@ TEST(MemoryMeterTest, WhatWasThereBeforeDoesNotCount)
     EXPECT_GE(meter.GetPeak(), kMuch);
 }
 
-/// The host's library and the XML library within it: the first keeps the value, the second's buffers hold the tag.
+/// Memory of the host's library counts (it keeps the value), and of the XML library (its buffer holds the tag).
 TEST(MemoryMeterTest, MemoryOfTheLibrariesCounts)
 {
     const std::string head = "<CIM CIMVERSION=\"2.0\" DTDVERSION=\"2.0\"><DECLARATION><DECLGROUP>";

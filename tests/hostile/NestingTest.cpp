@@ -1,8 +1,8 @@
-// Elements, attributes and names beyond any measure.
+// Very many elements and attributes, and very long names.
 #include "embedded/cimxml/TCimXmlPopulator.h"
 #include "embedded/store/TInMemNamespace.h"
+#include "tests/hostile/DocumentParts.h"
 #include "tests/hostile/HostileRow.h"
-#include "tests/hostile/Repeat.h"
 
 namespace NORVZEL20 {
 
@@ -11,18 +11,19 @@ namespace {
 std::string Attributes(std::size_t count)
 {
     std::string text;
-    for (std::size_t i = 0; i < count; ++i)
+    for (std::size_t i = 0; i < count; ++i) {
         text += " a" + std::to_string(i) + "=''";
+    }
     return text;
 }
 
-/// What the populator finds first where a property's value holds an element.
+/// The message of the populator for an element in a property's value.
 std::string UnexpectedIn(const std::string& element)
 {
     return "hostile.xml:1:" + std::to_string(kContentColumn) + ": found element <" + element + "> in <VALUE>, expected nothing";
 }
 
-/// An element within a value ends the value, whose name is then empty.
+/// An element inside of a value ends the value, which is then empty.
 const std::string kEmptyProperty = "status 9\nDiff-XML Parser line 1:Invalid property \"\" specified on line 1\n\n"
                                    "TDiffXMLParser: Threw exception in EndElementParse error on line 1";
 
@@ -43,7 +44,7 @@ TEST(NestingTest, TenThousandAttributesAreRefused)
                     Refused("one twice", {"", "<a b='' c='' b=''/>"}, 13, "duplicate attribute")});
 }
 
-/// A long name is one that nobody knows, as any other; messages give its beginning.
+/// A long name is an unknown name like any other; messages quote its beginning.
 TEST(NestingTest, NamesOfAMegabyteAreNames)
 {
     const std::string name(kMegabyte, 'n');
@@ -65,13 +66,13 @@ TEST(NestingTest, TagsBeyondTheLimitAreRefused)
                     Within(120 * kMegabyte, Refused("a value", {"", value}, 0, "a tag is too long"))});
 }
 
-/// What need not be kept may be as long as it likes.
+/// What is not kept may be long.
 TEST(NestingTest, LongCommentsAreReadOver)
 {
     ExpectOutcomes({Within(40 * kMegabyte, Handled("a comment", {"", "I<!--" + std::string(20 * kMegabyte, '.') + "-->d"}))});
 }
 
-/// Whoever walks a class tree does so recursively, so its height is bounded.
+/// Class trees are walked recursively, so their height is bounded.
 TEST(NestingTest, ATreeOfTooManyLevelsIsRefused)
 {
     std::string text =
@@ -92,13 +93,13 @@ TEST(NestingTest, ATreeOfTooManyLevelsIsRefused)
     EXPECT_TRUE(ns->GetClasses().empty());
 }
 
-/// A default declared once is handed out for every element.
+/// A default is declared once and delivered with every element.
 TEST(NestingTest, LongDefaultsOfAttributesAreRefusedBeforeTheyAddUp)
 {
     const std::string prolog = "<!DOCTYPE r [<!ATTLIST a b CDATA \"" + std::string(kMegabyte, 'x') + "\">]>";
     const THostileDocument document{prolog, Repeat("<a/>", 10000)};
     const TReading reading = document.ReadByParser();
-    EXPECT_EQ("line 1: attribute defaults expand too much", reading.told);
+    EXPECT_EQ("line 1: attribute defaults expand too much", reading.outcome);
     EXPECT_LT(reading.peak, 16 * kMegabyte);
     EXPECT_LT(reading.total, 100 * kMegabyte);
 }

@@ -1,4 +1,4 @@
-// Sources that deliver little at a time: what the XML library looks at stays in proportion to the document's length.
+// Sources that deliver little at a time: the number of bytes that the XML library scans stays linear in the document's length.
 #include <gmock/gmock.h>
 
 #include <algorithm>
@@ -7,6 +7,7 @@
 
 #include "embedded/cimxml/TCimXmlPopulator.h"
 #include "fuzz/SampleInventory.h"
+#include "tests/hostile/DocumentParts.h"
 #include "tests/hostile/TGeneratedText.h"
 #include "tests/hostile/TMemoryMeter.h"
 #include "tests/hostile/TScanMeter.h"
@@ -15,12 +16,7 @@ namespace NORVZEL20 {
 
 namespace {
 
-constexpr std::uint64_t kMegabyte = 1u << 20;
-
-const std::string kGroup = "<CIM CIMVERSION=\"2.0\" DTDVERSION=\"2.0\"><DECLARATION><DECLGROUP>";
-const std::string kEnd = "</DECLGROUP></DECLARATION></CIM>";
-
-/// Loads documents that come in pieces of at most so many bytes.
+/// Loads documents that come in pieces of a given size.
 class SlowSourceTest : public testing::Test {
   protected:
     std::string Load(TGeneratedText text, std::size_t piece)
@@ -56,7 +52,7 @@ class SlowSourceTest : public testing::Test {
     std::size_t fCallsAfterEnd = 0;
 };
 
-/// A document in which something goes on for so many megabytes.
+/// A document with one part that can be as long as a test likes.
 struct TLongRow {
     const char* name;
     std::string beginning;
@@ -84,10 +80,10 @@ std::vector<TLongRow> LongRows()
 
 }  // namespace
 
-/// Whatever goes on, the library looks at each byte a few times, however small the pieces and however long the document.
+/// The library scans each byte only a few times, however small the pieces are and however long the part is.
 TEST_F(SlowSourceTest, WhatGoesOnIsNotBegunAnewForEachPiece)
 {
-    for (const TLongRow& row : LongRows())
+    for (const TLongRow& row : LongRows()) {
         for (const std::uint64_t megabytes : {1, 4, 15}) {
             SCOPED_TRACE(row.name + (" of megabytes: " + std::to_string(megabytes)));
             EXPECT_EQ("loaded", Load(row.Make(megabytes), 1000));
@@ -95,6 +91,7 @@ TEST_F(SlowSourceTest, WhatGoesOnIsNotBegunAnewForEachPiece)
             EXPECT_LE(fScanned, 4 * fLength);
             EXPECT_LE(fTotal, 12 * fLength + kMegabyte);  // buffers double, and the old one is copied
         }
+    }
 }
 
 TEST_F(SlowSourceTest, WhatNeverEndsIsRefusedAtItsLimit)
@@ -104,19 +101,20 @@ TEST_F(SlowSourceTest, WhatNeverEndsIsRefusedAtItsLimit)
     EXPECT_LE(fScanned, 3 * fPulled);
 }
 
-/// A terminal would ask its user to end the document again.
+/// At a terminal, asking again would make the user end the document twice.
 TEST_F(SlowSourceTest, TheEndIsAskedForOnce)
 {
-    for (const std::size_t piece : {std::size_t{1}, std::size_t{1000}, std::size_t{kMegabyte}})
+    for (const std::size_t piece : {std::size_t{1}, std::size_t{1000}, std::size_t{kMegabyte}}) {
         for (const std::uint64_t length : {kMegabyte / 4 - 1, kMegabyte / 4, kMegabyte / 4 + 1, kMegabyte}) {
             SCOPED_TRACE(std::to_string(length) + " bytes in pieces of " + std::to_string(piece));
             EXPECT_EQ("loaded", Load({kGroup, " ", length - kGroup.size() - kEnd.size(), kEnd}, piece));
             EXPECT_EQ(length, fGiven);
             EXPECT_EQ(1U, fCallsAfterEnd);
         }
+    }
 }
 
-/// What is parsed at a time ends within tags, characters, line ends and references, one shift after the other.
+/// The boundary between two pieces is moved through a document, byte by byte: through tags, characters, line ends and references.
 TEST_F(SlowSourceTest, APieceMayEndAnywhere)
 {
     const std::string object =

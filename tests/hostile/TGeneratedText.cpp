@@ -8,15 +8,17 @@ TGeneratedText::TGeneratedText(std::string beginning, const std::string& unit, s
     : fBeginning(std::move(beginning)), fUnitSize(unit.size()), fMiddleSize(unit.size() * times), fEnd(std::move(end))
 {
     constexpr std::size_t kBlockSize = 64 * 1024;
-    while (fUnits.size() < kBlockSize && fUnits.size() < fMiddleSize)
+    while (fUnits.size() < kBlockSize && fUnits.size() < fMiddleSize) {
         fUnits += unit;
+    }
 }
 
-/// What stands at the position, as far as it is at hand in one piece.
+/// The text from the position on, as far as it is in one piece.
 std::string_view TGeneratedText::At(std::uint64_t position) const
 {
-    if (position < fBeginning.size())
+    if (position < fBeginning.size()) {
         return std::string_view(fBeginning).substr(static_cast<std::size_t>(position));
+    }
     position -= fBeginning.size();
     if (position < fMiddleSize) {
         const std::string_view units = std::string_view(fUnits).substr(static_cast<std::size_t>(position % fUnitSize));

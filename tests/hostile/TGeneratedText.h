@@ -7,7 +7,7 @@
 
 namespace NORVZEL20 {
 
-/// A text of any length that is never held: a beginning, a unit so many times over, and an end.
+/// A text of any length that is never in memory as a whole: a beginning, a unit many times, and an end.
 class TGeneratedText {
   public:
     TGeneratedText(std::string beginning, const std::string& unit, std::uint64_t times, std::string end);
@@ -23,7 +23,7 @@ class TGeneratedText {
     std::string_view At(std::uint64_t position) const;
 
     std::string fBeginning;
-    std::string fUnits;  // some of them, to be copied at once
+    std::string fUnits;  // several, to be copied at once
     std::size_t fUnitSize;
     std::uint64_t fMiddleSize;
     std::string fEnd;

@@ -14,18 +14,22 @@ namespace NORVZEL20 {
 
 namespace {
 
-/// Counts elements and keeps the text; remembers the first reason and complains of a second one.
+/// Counts elements and keeps the text; notes the reason of a failure, and a second one as an error.
 class TPlainParser : public TXmlParser {
   public:
     void StartElement(const char*, std::map<std::string, std::string>&) override { ++fElements; }
     void characters(const char* text, unsigned int length) override { fText.append(text, length); }
     void FatalError(const char* message) override
     {
-        if (!fReason.empty())
+        if (!fReason.empty()) {
             fReason += " AND AGAIN ";
+        }
         fReason += "line " + std::to_string(GetCurLine()) + ": " + message;
     }
-    std::string Tell() const { return fReason.empty() ? std::to_string(fElements) + " elements, text '" + fText + "'" : fReason; }
+    std::string Describe() const
+    {
+        return fReason.empty() ? std::to_string(fElements) + " elements, text '" + fText + "'" : fReason;
+    }
 
   private:
     std::size_t fElements = 0;
@@ -33,28 +37,30 @@ class TPlainParser : public TXmlParser {
     std::string fReason;
 };
 
-std::string TellRules(TCIMDiffEngine::TRuleset ruleset)
+std::string DescribeRules(TCIMDiffEngine::TRuleset ruleset)
 {
-    std::string told = "rules for";
-    for (const auto& property : ruleset.getClassRules("Device")->fProperties)
-        told += " '" + property.first + "'";
-    return told;
+    std::string outcome = "rules for";
+    for (const auto& property : ruleset.getClassRules("Device")->fProperties) {
+        outcome += " '" + property.first + "'";
+    }
+    return outcome;
 }
 
-std::string TellRefusal(const TZELException& error, const TLogRecorder& log)
+std::string DescribeRefusal(const TZELException& error, const TLogRecorder& log)
 {
-    std::string told = "status " + std::to_string(error.GetStatusCode().GetStatus());
-    for (const std::string& message : log.GetMessages())
-        told += "\n" + message;
-    return told;
+    std::string outcome = "status " + std::to_string(error.GetStatusCode().GetStatus());
+    for (const std::string& message : log.GetMessages()) {
+        outcome += "\n" + message;
+    }
+    return outcome;
 }
 
 template <class TRead>
 TReading Measure(TRead read)
 {
     const TMemoryMeter meter;
-    const std::string told = read();
-    return {told, meter.GetPeak(), meter.GetTotal()};
+    const std::string outcome = read();
+    return {outcome, meter.GetPeak(), meter.GetTotal()};
 }
 
 }  // namespace
@@ -71,7 +77,7 @@ TReading THostileDocument::ReadByParser() const
     return Measure([&text] {
         TPlainParser parser;
         parser.Parse(text.data(), text.size());
-        return parser.Tell();
+        return parser.Describe();
     });
 }
 
@@ -104,9 +110,9 @@ TReading THostileDocument::ReadAsSpecification() const
         try {
             TCIMDiffEngine::TDiffXMLParser parser(schema);
             parser.Parse(text.data(), text.size());
-            return TellRules(parser.getRuleset());
+            return DescribeRules(parser.getRuleset());
         } catch (const TZELException& error) {
-            return TellRefusal(error, log);
+            return DescribeRefusal(error, log);
         }
     });
 }

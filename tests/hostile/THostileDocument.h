@@ -5,19 +5,19 @@
 
 namespace NORVZEL20 {
 
-/// What a reader made of a document, and the memory that took, the document's own not counted.
+/// How a reader ended, and the memory that it took, without that of the document itself.
 struct TReading {
-    std::string told;
+    std::string outcome;
     std::size_t peak;   ///< the most bytes in use at a time
     std::size_t total;  ///< all bytes that were allocated
 };
 
-/// A hostile text as three readers meet it: as content of a plain document, of a property's value in an inventory, and of a
-/// property's name in a specification. What each makes of it is told as text.
+/// A hostile text for three readers: as the content of a plain document, of a property's value in an inventory, and of a property's
+/// name in a specification. The outcome of each is a text.
 struct THostileDocument {
-    std::string prolog;                                   ///< what stands before the document's element
-    std::string content;                                  ///< what stands in it; "Id" is harmless everywhere
-    std::string (*encode)(const std::string&) = nullptr;  ///< applied to the whole document; null: nothing
+    std::string prolog;                                   ///< the text before the document's element
+    std::string content;                                  ///< the text in it; "Id" is harmless everywhere
+    std::string (*encode)(const std::string&) = nullptr;  ///< applied to the whole document; null for none
 
     /// TXmlParser: "N elements, text 'T'", or "line N: reason".
     TReading ReadByParser() const;

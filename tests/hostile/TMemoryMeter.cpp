@@ -20,7 +20,7 @@ namespace NORVZEL20 {
 
 namespace {
 
-// Below zero where what was there before counting began is freed.
+// Negative if memory from before the counting is freed.
 std::atomic<std::ptrdiff_t> inUse{0};
 std::atomic<std::ptrdiff_t> peak{0};
 std::atomic<std::size_t> total{0};
@@ -46,8 +46,9 @@ static bool IsCounting();
 
 TMemoryMeter::TMemoryMeter() : fInUseAtStart(inUse), fTotalAtStart(total)
 {
-    if (!IsCounting())
+    if (!IsCounting()) {
         throw std::logic_error("no memory is counted");
+    }
     peak = fInUseAtStart;
 }
 
@@ -78,8 +79,9 @@ void OnMalloc(const volatile void*, std::size_t size)
 
 void OnFree(const volatile void* block)
 {
-    if (block != nullptr)
+    if (block != nullptr) {
         NORVZEL20::Lose(__sanitizer_get_allocated_size(block));
+    }
 }
 
 const int hooksInstalled = __sanitizer_install_malloc_and_free_hooks(OnMalloc, OnFree);

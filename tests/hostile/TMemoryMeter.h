@@ -4,12 +4,12 @@
 
 namespace NORVZEL20 {
 
-/// Counts what the whole process allocates, C libraries included, so that tests bound memory and work without a clock.
+/// Counts what the whole process allocates, C libraries included. With it, tests bound memory and work without a clock.
 ///
-/// Replaces the C library's malloc in the test program, or asks the sanitizer that has replaced it already.
+/// It replaces the C library's malloc in the test program, or uses the hooks of a sanitizer that has replaced malloc already.
 class TMemoryMeter {
   public:
-    /// Counts from now on. Errors: std::logic_error where the sanitizer tells nothing, so that no bound holds for want of counting.
+    /// Counts from now on. Errors: std::logic_error if the sanitizer reports nothing; otherwise all bounds would hold.
     TMemoryMeter();
 
     /// The most bytes that were in use at a time, beyond those at the start.

@@ -12,7 +12,7 @@ namespace {
 
 XML_Parser current = nullptr;
 std::uint64_t givenToCurrent = 0;
-std::uint64_t pending = 0;  // bytes of the current parser that the next piece is joined to
+std::uint64_t pending = 0;  // bytes that the current parser will scan again with the next piece
 std::uint64_t scanned = 0;
 std::uint64_t given = 0;
 
@@ -30,13 +30,14 @@ void BeforePiece(XML_Parser parser, int length)
 
 void AfterPiece(XML_Parser parser)
 {
-    if (parser != current)
+    if (parser != current) {
         return;
+    }
     const XML_Index index = XML_GetCurrentByteIndex(parser);
     pending = index < 0 ? 0 : givenToCurrent - static_cast<std::uint64_t>(index);
 }
 
-/// The library's function of that name, behind the one of this program.
+/// The library's own function of that name.
 template <class TFunction>
 TFunction* FindNext(const char* name)
 {
@@ -63,7 +64,7 @@ std::uint64_t TScanMeter::GetGiven() const
 
 }  // namespace NORVZEL20
 
-// Found before the library's own functions of those names.
+// The linker finds these before the library's own.
 
 XML_Status XML_Parse(XML_Parser parser, const char* data, int length, int isFinal)
 {

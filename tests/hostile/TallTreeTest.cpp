@@ -1,15 +1,14 @@
-// A class tree as tall as one may be, compared under rules: everything that goes down the tree does so recursively.
+// A class tree of the greatest height that is allowed, compared under rules: the engine and the rules walk it recursively.
 #include <gtest/gtest.h>
 
 #include "embedded/cimxml/TCimXmlPopulator.h"
+#include "tests/hostile/DocumentParts.h"
 #include "tests/hostile/TMemoryMeter.h"
 #include "tests/support/TComparisonRun.h"
 
 namespace NORVZEL20 {
 
 namespace {
-
-constexpr std::size_t kMegabyte = 1u << 20;
 
 std::string ClassName(std::size_t level)
 {
@@ -24,20 +23,21 @@ std::string Instance(std::size_t level, const std::string& value)
            "</VALUE></PROPERTY></INSTANCE></VALUE.OBJECT>";
 }
 
-/// A class with two values, so many subclasses one below the other, and an instance of the first, the middle and the last.
+/// A class with two values, that many subclasses, each below the one before, and an instance of the first, the middle and the last.
 std::string Tree(std::size_t levels, const std::string& value)
 {
     std::string text = "<CIM CIMVERSION=\"2.0\" DTDVERSION=\"2.0\"><DECLARATION><DECLGROUP><VALUE.OBJECT><CLASS NAME=\"C0\">"
                        "<PROPERTY NAME=\"Id\" TYPE=\"string\"><QUALIFIER NAME=\"Key\" TYPE=\"boolean\"><VALUE>TRUE</VALUE>"
                        "</QUALIFIER></PROPERTY><PROPERTY NAME=\"V\" TYPE=\"string\"/><PROPERTY NAME=\"W\" TYPE=\"string\"/>"
                        "</CLASS></VALUE.OBJECT>";
-    for (std::size_t level = 1; level <= levels; ++level)
+    for (std::size_t level = 1; level <= levels; ++level) {
         text +=
             "<VALUE.OBJECT><CLASS NAME=\"" + ClassName(level) + "\" SUPERCLASS=\"" + ClassName(level - 1) + "\"/></VALUE.OBJECT>";
+    }
     return text + Instance(0, value) + Instance(levels / 2, value) + Instance(levels, value) + "</DECLGROUP></DECLARATION></CIM>";
 }
 
-/// Compares two inventories with trees of that height, whose instances all differ.
+/// Compares two inventories with such trees, whose instances all differ.
 class TallTreeTest : public testing::Test {
   protected:
     std::string Compare(std::size_t levels)

@@ -1,4 +1,4 @@
-// Values and patterns that would be gone over again and again: the bytes that this allocates are counted.
+// Values and patterns that could make comparing or matching repeat work: the bytes allocated are counted.
 #include <gtest/gtest.h>
 
 #include <boost/smart_ptr/make_shared.hpp>
@@ -15,7 +15,7 @@ constexpr std::size_t kMany = 2000;
 
 }  // namespace
 
-/// Two bags of the same objects in opposite order: pairing them off compares each with its own.
+/// Two bags of the same objects in opposite order: each object is compared with its own counterpart.
 TEST(BagTest, BagsOfObjectsThatDifferInTheirArraysAreComparedInProportion)
 {
     std::vector<TCIMValue> objects;

@@ -95,7 +95,7 @@ TEST(BadInputTest, EachGetsOneMessageAndLeavesNothing)
     }
 }
 
-TEST(BadInputTest, AMissingFileIsToldByItsName)
+TEST(BadInputTest, AMissingFileIsReportedByItsName)
 {
     TLoading loading;
     try {
@@ -137,22 +137,22 @@ TEST(CimXmlContextTest, WhatTheNamespaceRefusesEndsTheLoadAtItsPlace)
 {
     TCimXmlContext context("doc.xml");
     const TCimXmlContext::TAt at(context, {3, 4});
-    const auto errorOf = [&context](const TZELException& error) {
+    const auto errorOf = [&context](const TZELException& thrown) {
         try {
-            context.Guard([&] { throw error; });
+            context.Guard([&] { throw thrown; });
             return std::string();
-        } catch (const TPopulateError& told) {
-            return std::to_string(told.GetStatusCode().GetStatus()) + " " + told.what();
+        } catch (const TPopulateError& error) {
+            return std::to_string(error.GetStatusCode().GetStatus()) + " " + error.what();
         }
     };
     EXPECT_EQ("13 doc.xml:3:4: found something that cannot be loaded: Type mismatch",
               errorOf(TZELException(TZELStatusCode::kTypeMismatch)));
     EXPECT_EQ(5, context.Guard([] { return 5; }));
     try {
-        context.Guard([] { throw TPopulateError(TZELStatusCode::kParseError, "told", "other.xml", 1, 2); });
+        context.Guard([] { throw TPopulateError(TZELStatusCode::kParseError, "message", "other.xml", 1, 2); });
         ADD_FAILURE() << "nothing was thrown";
-    } catch (const TPopulateError& told) {
-        EXPECT_STREQ("other.xml:1:2: told", told.what());
+    } catch (const TPopulateError& error) {
+        EXPECT_STREQ("other.xml:1:2: message", error.what());
     }
 }
 

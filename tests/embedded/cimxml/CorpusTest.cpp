@@ -24,9 +24,11 @@ const std::string kOpenPegasus = CIMDELTA_TEST_DATA "/interchange-openpegasus/";
 /// The list's spelling of a path as the store gives it: own namespace and host left out, char16 in single quotes.
 std::string Normalized(std::string path)
 {
-    for (const char* own : {"//peer.example.com:5989/root/cimv2:", "root/cimv2:"})
-        for (std::size_t place = path.find(own); place != std::string::npos; place = path.find(own))
+    for (const char* own : {"//peer.example.com:5989/root/cimv2:", "root/cimv2:"}) {
+        for (std::size_t place = path.find(own); place != std::string::npos; place = path.find(own)) {
             path.erase(place, std::string(own).size());
+        }
+    }
     return std::regex_replace(path, std::regex("k_char16=\\\\*\"(.)\\\\*\""), "k_char16='$1'");
 }
 
@@ -35,8 +37,9 @@ bool Matches(const TCIMValue& value, const TJson& expected);
 bool MatchesReal(const TCIMValue& value, const TJson& expected)
 {
     double number = expected.is_string() ? std::strtod(expected.get<std::string>().c_str(), nullptr) : expected.get<double>();
-    if (value.GetType() == TType::kReal32)
+    if (value.GetType() == TType::kReal32) {
         number = static_cast<double>(static_cast<float>(number));
+    }
     const double real = value.GetReal();
     return (std::isnan(number) && std::isnan(real)) || (number == real && std::signbit(number) == std::signbit(real));
 }
@@ -44,24 +47,31 @@ bool MatchesReal(const TCIMValue& value, const TJson& expected)
 bool MatchesText(const TCIMValue& value, const TJson& expected)
 {
     const auto object = value.GetEmbeddedObject();
-    if (expected.is_string())
+    if (expected.is_string()) {
         return !object && value.GetString() == expected.get<std::string>();
-    if (!object || object->IsClass() != expected.contains("$class"))
+    }
+    if (!object || object->IsClass() != expected.contains("$class")) {
         return false;
-    if (object->GetClassName() != expected.at(object->IsClass() ? "$class" : "$instance").get<std::string>())
+    }
+    if (object->GetClassName() != expected.at(object->IsClass() ? "$class" : "$instance").get<std::string>()) {
         return false;
-    if (object->IsClass())
+    }
+    if (object->IsClass()) {
         return true;
-    for (const auto& [name, property] : expected.at("properties").items())
-        if (!object->FindProperty(name) || !Matches(object->FindProperty(name)->fValue, property.at("value")))
+    }
+    for (const auto& [name, property] : expected.at("properties").items()) {
+        if (!object->FindProperty(name) || !Matches(object->FindProperty(name)->fValue, property.at("value"))) {
             return false;
+        }
+    }
     return true;
 }
 
 bool Matches(const TCIMValue& value, const TJson& expected)
 {
-    if (value.IsNull() || expected.is_null())
+    if (value.IsNull() || expected.is_null()) {
         return value.IsNull() && expected.is_null();
+    }
     if (value.GetType().IsArray()) {
         const std::vector<TCIMValue>& elements = value.GetElements();
         return expected.is_array() && std::equal(elements.begin(), elements.end(), expected.begin(), expected.end(), Matches);
@@ -98,8 +108,9 @@ const std::map<std::string, TJson>& Expected()
         std::map<std::string, TJson> byPath;
         std::ifstream file(kPywbem + "expected.json");
         const TJson list = TJson::parse(file);
-        for (const TJson& instance : list.at("instances"))
+        for (const TJson& instance : list.at("instances")) {
             byPath.emplace(Normalized(instance.at("path").get<std::string>()), instance.at("properties"));
+        }
         return byPath;
     }();
     return expected;
@@ -120,24 +131,26 @@ std::size_t CompareWithList(const TLoading& loading)
         const auto compareProperty = [&](const boost::shared_ptr<ICIMProperty>& property) {
             const std::string name = property->GetPropertyDecl(TCallContext())->GetName(TCallContext());
             const TCIMValue& value = property->GetValue(TCallContext());
-            const auto told = expected->second.find(name);
-            const bool isEqual = told == expected->second.end() ? value.IsNull() : Matches(value, told->at("value"));
+            const auto listed = expected->second.find(name);
+            const bool isEqual = listed == expected->second.end() ? value.IsNull() : Matches(value, listed->at("value"));
             EXPECT_TRUE(isEqual) << path << " " << name << " is " << value.ToText();
             return true;
         };
         instance->EnumerateProperties(compareProperty, TCallContext());
         return true;
     };
-    for (const boost::shared_ptr<TInMemClass>& cls : loading.GetNamespace()->GetClasses())
+    for (const boost::shared_ptr<TInMemClass>& cls : loading.GetNamespace()->GetClasses()) {
         cls->EnumerateInstances(compare, false, TCallContext());
+    }
     return count;
 }
 
 std::size_t CountInstances(const TLoading& loading)
 {
     std::size_t count = 0;
-    for (const boost::shared_ptr<TInMemClass>& cls : loading.GetNamespace()->GetClasses())
+    for (const boost::shared_ptr<TInMemClass>& cls : loading.GetNamespace()->GetClasses()) {
         count += cls->GetInstanceCount();
+    }
     return count;
 }
 
@@ -152,35 +165,39 @@ void ExpectSameAfterWriting(const TLoading& loading)
     EXPECT_EQ(written, again.Write());
 }
 
-struct TDocument {
+struct TDocumentRow {
     const char* name;
-    const char* before;  ///< what declares the classes that it lacks
+    const char* before;  ///< the document that declares the classes which it lacks; null if it lacks none
     std::size_t instances;
 };
 
-class PywbemDocumentTest : public testing::TestWithParam<TDocument> {};
+class PywbemDocumentTest : public testing::TestWithParam<TDocumentRow> {};
 
 TEST_P(PywbemDocumentTest, HoldsWhatTheListSaysAndComesBackEqual)
 {
     TLoading loading;
-    if (GetParam().before != nullptr)
+    if (GetParam().before != nullptr) {
         loading.LoadFile(kPywbem + GetParam().before);
+    }
     loading.LoadFile(kPywbem + GetParam().name);
     EXPECT_EQ(GetParam().instances, CompareWithList(loading));
     ExpectSameAfterWriting(loading);
 }
 
-INSTANTIATE_TEST_SUITE_P(
-    All, PywbemDocumentTest,
-    testing::Values(TDocument{"01-qualifiers.xml", nullptr, 0}, TDocument{"02-classes.xml", nullptr, 0},
-                    TDocument{"03-instances.xml", "02-classes.xml", 90}, TDocument{"04-all-in-one.xml", nullptr, 90},
-                    TDocument{"05-withname.xml", nullptr, 90}, TDocument{"06-withpath.xml", "02-classes.xml", 90},
-                    TDocument{"07-three-groups.xml", nullptr, 10},
-                    TDocument{"08-response-enumerateinstances.xml", "02-classes.xml", 90},
-                    TDocument{"09-response-pull.xml", "02-classes.xml", 90}, TDocument{"12-instances-indented.xml", nullptr, 15},
-                    TDocument{"13-instances-utf16.xml", "02-classes.xml", 90},
-                    TDocument{"14-instances-latin1.xml", "02-classes.xml", 82}, TDocument{"15-instances-cdata.xml", nullptr, 90},
-                    TDocument{"16-arrays-null-as-empty-value.xml", "02-classes.xml", 6}));
+INSTANTIATE_TEST_SUITE_P(All, PywbemDocumentTest,
+                         testing::Values(TDocumentRow{"01-qualifiers.xml", nullptr, 0}, TDocumentRow{"02-classes.xml", nullptr, 0},
+                                         TDocumentRow{"03-instances.xml", "02-classes.xml", 90},
+                                         TDocumentRow{"04-all-in-one.xml", nullptr, 90},
+                                         TDocumentRow{"05-withname.xml", nullptr, 90},
+                                         TDocumentRow{"06-withpath.xml", "02-classes.xml", 90},
+                                         TDocumentRow{"07-three-groups.xml", nullptr, 10},
+                                         TDocumentRow{"08-response-enumerateinstances.xml", "02-classes.xml", 90},
+                                         TDocumentRow{"09-response-pull.xml", "02-classes.xml", 90},
+                                         TDocumentRow{"12-instances-indented.xml", nullptr, 15},
+                                         TDocumentRow{"13-instances-utf16.xml", "02-classes.xml", 90},
+                                         TDocumentRow{"14-instances-latin1.xml", "02-classes.xml", 82},
+                                         TDocumentRow{"15-instances-cdata.xml", nullptr, 90},
+                                         TDocumentRow{"16-arrays-null-as-empty-value.xml", "02-classes.xml", 6}));
 
 TEST(PywbemResponseTest, AClassAloneNeedsItsSuperclass)
 {
@@ -228,8 +245,9 @@ TEST(OpenPegasusTest, ResponsesBuildTheSameNamespaceAsTheInventory)
     inventory.LoadFile(kOpenPegasus + "root_deb/inventory.xml");
     TLoading responses;
     for (const char* name : {"EnumerateQualifiers", "GetClass.DEB_Package", "GetClass.DEB_PackageDependency",
-                             "EnumerateInstances.DEB_Package", "EnumerateInstances.DEB_PackageDependency"})
+                             "EnumerateInstances.DEB_Package", "EnumerateInstances.DEB_PackageDependency"}) {
         responses.LoadFile(kOpenPegasus + "root_deb/" + name + ".xml");
+    }
     EXPECT_EQ(inventory.PathsOf("DEB_Package"), responses.PathsOf("DEB_Package"));
     EXPECT_EQ(inventory.PathsOf("DEB_PackageDependency"), responses.PathsOf("DEB_PackageDependency"));
 }

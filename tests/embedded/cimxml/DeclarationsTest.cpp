@@ -12,7 +12,7 @@ using L = TLoading;
 struct TRow {
     const char* what;
     std::string document;
-    std::string told;
+    std::string message;
 };
 
 std::string Text(const std::string& name, const std::string& within = std::string())
@@ -47,12 +47,13 @@ std::string Referring(const std::string& path)
 std::string LongName(std::size_t length)
 {
     std::string name = "x";
-    while (name.size() < length)
+    while (name.size() < length) {
         name += "\xC3\xBC";
+    }
     return name;
 }
 
-const TRow kRefused[] = {
+const TRow kRefusedRows[] = {
     {"another type than above", L::Group(L::Class("A", Text("S")) + Below("<PROPERTY.ARRAY NAME=\"S\" TYPE=\"uint8\"/>")),
      "doc.xml:3:46: found property \"S\" of type uint8[] in class \"B\", but a superclass declares it as string"},
     {"a property twice", L::Group(L::Class("A", Text("S") + Text("s"))),
@@ -81,7 +82,7 @@ const TRow kRefused[] = {
          "...\", which is not declared; add its <CLASS> to the document or load it before"},
 };
 
-const TRow kTolerated[] = {
+const TRow kToleratedRows[] = {
     {"a qualifier declared again", L::Group(QualifierDecl("x") + QualifierDecl("x")),
      "3: qualifier \"Q\" is declared again; the first declaration stands (1)\n"},
     {"another flavor than above",
@@ -96,15 +97,15 @@ const TRow kTolerated[] = {
 
 TEST(DeclarationsTest, WhatContradictsItselfIsRefused)
 {
-    for (const TRow& row : kRefused) {
-        EXPECT_EQ(row.told, TLoading().ErrorOf(row.document)) << row.what;
+    for (const TRow& row : kRefusedRows) {
+        EXPECT_EQ(row.message, TLoading().ErrorOf(row.document)) << row.what;
     }
 }
 
 TEST(DeclarationsTest, WhatIsOddIsToleratedWithAWord)
 {
-    for (const TRow& row : kTolerated) {
-        EXPECT_EQ(row.told, L::Tolerated(TLoading().Load(row.document))) << row.what;
+    for (const TRow& row : kToleratedRows) {
+        EXPECT_EQ(row.message, L::Tolerated(TLoading().Load(row.document))) << row.what;
     }
 }
 

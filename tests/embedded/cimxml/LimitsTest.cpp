@@ -15,8 +15,9 @@ using L = TLoading;
 std::string Many(const std::string& element, std::size_t first, std::size_t count, const std::string& rest)
 {
     std::string text;
-    for (std::size_t number = first; number < first + count; ++number)
+    for (std::size_t number = first; number < first + count; ++number) {
         text += "<" + element + " NAME=\"N" + std::to_string(number) + "\"" + rest;
+    }
     return text;
 }
 

@@ -9,9 +9,9 @@ namespace {
 
 using L = TLoading;
 
-// What a document may call things, and how often: whatever loads must be told apart again by its path.
+// The names that a document may use, and how often: two things that are loaded must never have the same path.
 
-/// The message for a document whose one instance refers to something by the elements in `path`, from its second line on.
+/// The message, without its place, for a document whose one instance refers to something by the elements in `path`.
 std::string ErrorOfPath(const std::string& path, const std::string& before = std::string())
 {
     const std::string reference = "<PROPERTY.REFERENCE NAME=\"R\"/>";

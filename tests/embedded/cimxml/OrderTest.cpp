@@ -68,7 +68,7 @@ std::string ContentsOf(const TLoading& loading)
     return text;
 }
 
-/// What the contents are in every order of the elements; several texts, one below the other, where they are not always the same.
+/// The contents after loading the elements in every order. If they are not always the same: all that occurred, with "or" between.
 std::string ContentsInEveryOrder(std::vector<std::string> elements)
 {
     std::sort(elements.begin(), elements.end());

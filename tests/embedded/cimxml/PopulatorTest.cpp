@@ -86,13 +86,15 @@ TEST_F(PopulatorTest, ReferencesIntoTheOwnNamespaceAreStoredWithoutIt)
     };
     std::string contents =
         "<NAMESPACEPATH><HOST>h</HOST>" + LocalNamespace("root", "here") + "</NAMESPACEPATH>" + L::Class("A", kReferenceR);
-    for (const auto& row : rows)
+    for (const auto& row : rows) {
         contents += L::Instance("A", row.id, Reference(row.path));
+    }
     const TLoadReport report = fLoading.Load(L::Group(contents));
     EXPECT_EQ("root/here", report.namespaceName);
     EXPECT_EQ("h", report.host);
-    for (const auto& row : rows)
+    for (const auto& row : rows) {
         EXPECT_EQ(row.stored, fLoading.ValueOf("A.Id=\"" + std::string(row.id) + "\"", "R")) << row.id;
+    }
 }
 
 TEST_F(PopulatorTest, WithoutANameTheNamespaceIsTheDefaultAndAnyHostItsOwn)
@@ -160,7 +162,7 @@ TEST_F(PopulatorTest, ARepeatedClassIsTolerated)
     EXPECT_THAT(L::Tolerated(report), testing::StartsWith("3: class \"A\" is declared again; the first declaration stands (1)\n"));
 }
 
-TEST_F(PopulatorTest, AClassThatIsThereAlreadyIsToleratedWhereItIsTheSame)
+TEST_F(PopulatorTest, AClassThatIsThereAlreadyIsToleratedIfItIsTheSame)
 {
     fLoading.Load(L::Group(L::Class("A", kPropertyS)));
     const TLoadReport report = fLoading.Load(L::Group(L::Class("A", kPropertyS) + L::Instance("A", "1")));
@@ -169,7 +171,7 @@ TEST_F(PopulatorTest, AClassThatIsThereAlreadyIsToleratedWhereItIsTheSame)
               fLoading.ErrorOf(L::Group(L::Class("A"))));
 }
 
-TEST_F(PopulatorTest, WhatASuperclassHasIsInheritedWhereADocumentRepeatsIt)
+TEST_F(PopulatorTest, WhatASuperclassHasIsInheritedIfADocumentRepeatsIt)
 {
     const std::string repeating =
         "<VALUE.OBJECT><CLASS NAME=\"B\" SUPERCLASS=\"A\"><PROPERTY NAME=\"S\" TYPE=\"string\" PROPAGATED=\"true\"/>"
@@ -198,14 +200,15 @@ TEST_F(PopulatorTest, EmbeddedObjectsAreReadByTheirMarkOrTheirDeclaration)
     EXPECT_EQ("words", valueOf("A.Id=\"plain\"", "E").GetString());
 }
 
-/// The text of embedded objects, one within the other.
+/// The text of embedded objects, one inside of the other.
 std::string Nested(int levels)
 {
     std::string text = "<INSTANCE CLASSNAME=\"X\"></INSTANCE>";
     for (int level = 0; level < levels; ++level) {
         std::string escaped;
-        for (const char c : text)
+        for (const char c : text) {
             escaped += c == '<' ? "&lt;" : c == '&' ? "&amp;" : std::string(1, c);
+        }
         text = "<INSTANCE CLASSNAME=\"A\">" + (level + 1 == levels ? L::Property("Id", "string", "1") : std::string()) +
                "<PROPERTY NAME=\"S\" TYPE=\"string\" EmbeddedObject=\"object\"><VALUE>" + escaped +
                "</VALUE></PROPERTY></INSTANCE>";
@@ -220,7 +223,7 @@ TEST_F(PopulatorTest, EmbeddedObjectsDoNotNestForEver)
                 testing::EndsWith(": in an embedded object: embedded objects are nested too deeply"));
 }
 
-TEST_F(PopulatorTest, WhatHoldsNoObjectsIsToldOnce)
+TEST_F(PopulatorTest, WhatHoldsNoObjectsIsReportedOnce)
 {
     const TLoadReport report =
         fLoading.Load("<CIM><MESSAGE><SIMPLERSP><IMETHODRESPONSE><IRETURNVALUE><INSTANCENAME CLASSNAME=\"A\"/>"
@@ -233,8 +236,9 @@ TEST_F(PopulatorTest, ASourceMayDeliverSingleBytes)
     const std::string document = L::Group(L::Class("A") + L::Instance("A", "\xC3\xBC"));
     std::size_t position = 0;
     const auto source = [&](char* buffer, std::size_t) -> std::size_t {
-        if (position == document.size())
+        if (position == document.size()) {
             return 0;
+        }
         *buffer = document[position++];
         return 1;
     };
@@ -247,8 +251,9 @@ TEST_F(PopulatorTest, AnErrorOfTheSourcePassesAndNothingStays)
     const std::string document = L::Group(L::Class("A"));
     bool isFirst = true;
     const auto source = [&](char* buffer, std::size_t) -> std::size_t {
-        if (!std::exchange(isFirst, false))
+        if (!std::exchange(isFirst, false)) {
             throw std::runtime_error("disk on fire");
+        }
         return document.copy(buffer, document.size() - 5);
     };
     TCimXmlPopulator populator(fLoading.GetNamespace());

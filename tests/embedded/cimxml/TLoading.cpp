@@ -94,8 +94,9 @@ std::string TLoading::Property(const std::string& name, const std::string& type,
 std::string TLoading::Tolerated(const TLoadReport& report)
 {
     std::string lines;
-    for (const TLoadReport::TTolerated& tolerated : report.tolerated)
+    for (const TLoadReport::TTolerated& tolerated : report.tolerated) {
         lines += std::to_string(tolerated.line) + ": " + tolerated.text + " (" + std::to_string(tolerated.count) + ")\n";
+    }
     return lines;
 }
 

@@ -8,20 +8,20 @@
 
 namespace NORVZEL20 {
 
-/// A namespace, and documents loaded into it.
+/// A namespace and the documents that are loaded into it, for tests. Also makes the elements of such documents.
 class TLoading {
   public:
     TLoading();
 
-    /// Loads the text, which is called "doc.xml" in messages.
+    /// Loads the text. Messages call it "doc.xml".
     TLoadReport Load(const std::string& document);
     TLoadReport LoadFile(const std::string& path);
-    /// The message of the failure to load the text, or "" where it loads.
+    /// The message when the text cannot be loaded; "" if it can.
     std::string ErrorOf(const std::string& document);
-    /// The status of that failure.
+    /// The status of that failure; 0 if the text can be loaded.
     int StatusOf(const std::string& document);
 
-    /// The value as ICIMProperty delivers it, as text; "no such instance" and the like where there is none.
+    /// The value of a property of an instance, as text; both must exist.
     std::string ValueOf(const std::string& path, const std::string& property) const;
     boost::shared_ptr<ICIMInstance> Find(const std::string& path) const;
     /// The paths of the instances of a class, a line for each.

@@ -24,7 +24,7 @@ TEST(CimXmlWriterTest, SpecialCharactersSurvive)
     EXPECT_EQ(loading.Write(), again.Write());
 }
 
-TEST(CimXmlWriterTest, TheNamespaceIsNamedWhereTheCallerSaysSo)
+TEST(CimXmlWriterTest, TheNamespaceIsNamedIfTheCallerSaysSo)
 {
     TLoading loading;
     std::string text;
@@ -67,8 +67,9 @@ class TNarrowSink {
 
     void Take(std::string_view piece)
     {
-        if (fPieces-- == 0)
+        if (fPieces-- == 0) {
             throw std::runtime_error("no room");
+        }
         fText += piece;
     }
     const std::string& GetText() const { return fText; }
@@ -87,8 +88,9 @@ TEST(CimXmlWriterTest, WhatTheSinkThrowsReachesTheCallerAndTheNextDocumentBegins
 {
     TLoading loading;
     std::string instances;
-    for (int number = 0; number < 3000; ++number)
+    for (int number = 0; number < 3000; ++number) {
         instances += L::Instance("A", std::to_string(number));
+    }
     loading.Load(L::Group(L::Class("A") + instances));
     const std::string whole = loading.Write();
     const std::size_t pieces = whole.size() / (64 * 1024) + 1;

@@ -13,11 +13,13 @@ class TRecorder : public TXmlParser {
   public:
     void StartElement(const char* name, std::map<std::string, std::string>& attrs) override
     {
-        if (std::string(name) == "throw")
+        if (std::string(name) == "throw") {
             throw std::runtime_error("thrown");
+        }
         fEvents += std::string("<") + name;
-        for (const auto& [key, value] : attrs)
+        for (const auto& [key, value] : attrs) {
             fEvents += " " + key + "=" + value;
+        }
         fEvents += ">";
     }
     void EndElement(const char* name) override { fEvents += std::string("</") + name + ">"; }
@@ -63,13 +65,13 @@ TEST(XmlParserTest, AttributesComeAsAMap)
     EXPECT_EQ("<a k=1 l=\"></a>", recorder.EventsOf("<a l='&quot;' k='1'/>"));
 }
 
-TEST(XmlParserTest, InstructionsAndNotationsAreTold)
+TEST(XmlParserTest, InstructionsAndNotationsAreReported)
 {
     TRecorder recorder;
     EXPECT_EQ("!n s!?t d?<a></a>", recorder.EventsOf("<!DOCTYPE a [<!NOTATION n SYSTEM 's'>]><?t d?><a/>"));
 }
 
-TEST(XmlParserTest, WhatIsNotWellFormedIsToldOnceWithItsPlace)
+TEST(XmlParserTest, WhatIsNotWellFormedIsReportedOnceWithItsPlace)
 {
     const struct {
         std::string document;
@@ -83,8 +85,9 @@ TEST(XmlParserTest, WhatIsNotWellFormedIsToldOnceWithItsPlace)
         {"<a/><b/>", "<a></a>{1:5 junk after document element}"},
         {"<?xml version='1.0' encoding='x-none'?><a/>", "{1:31 unknown encoding}"},
     };
-    for (const auto& row : rows)
+    for (const auto& row : rows) {
         EXPECT_EQ(row.events, TRecorder().EventsOf(row.document)) << row.document;
+    }
 }
 
 TEST(XmlParserTest, TheEncodingsAreRead)
@@ -117,13 +120,15 @@ TEST(XmlParserTest, ExternalEntitiesAreRefused)
 TEST(XmlParserTest, DepthAndAttributesAreBounded)
 {
     std::string deep;
-    for (int level = 0; level < 10001; ++level)
+    for (int level = 0; level < 10001; ++level) {
         deep += "<a>";
+    }
     const std::string events = TRecorder().EventsOf(deep);
     EXPECT_EQ("{1:30001 elements are nested too deeply}", events.substr(events.find('{')));
     std::string wide = "<a";
-    for (int number = 0; number < 1001; ++number)
+    for (int number = 0; number < 1001; ++number) {
         wide += " k" + std::to_string(number) + "=''";
+    }
     EXPECT_EQ("{1:1 too many attributes}", TRecorder().EventsOf(wide + "/>"));
 }
 
