@@ -6,7 +6,7 @@
 
 namespace NORVZEL20 {
 
-/// Takes the last element out for which `isIt` is true. Looks from the end, so that taking back what was added last costs little.
+/// Removes the last element for which `isIt` is true. It searches from the end: removing what was added last costs little.
 template <class T, class TMatch>
 void EraseLast(std::vector<T>& list, const TMatch& isIt)
 {

@@ -4,12 +4,12 @@
 
 namespace NORVZEL20 {
 
-/// A namespace that has a name; object paths made in it begin with that name. A namespace without this interface has none.
+/// A namespace that has a name. Object paths made in it begin with that name. A namespace without this interface has no name.
 class ILocated {
   public:
     virtual ~ILocated() = default;
 
-    /// Such as "root/cimv2", no slash in front or behind. Never changes; valid while the namespace lives.
+    /// A name such as "root/cimv2", without slashes at either end. Never changes. Valid while the namespace lives.
     virtual const std::string& GetNamespaceName() const = 0;
 };
 

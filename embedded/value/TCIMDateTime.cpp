@@ -1,3 +1,16 @@
+// Datetimes have 25 characters:
+//
+//     yyyymmddhhmmss.mmmmmmsutc    a point in time: sign and three digits are the minutes east of UTC
+//     ddddddddhhmmss.mmmmmm:000    an interval
+//
+// A field that is not known consists of asterisks; of the microseconds, any digit may be one. A datetime is held as microseconds
+// in UTC since 1970 (or in the interval), the offset, and one bit for each unknown field. An unknown field counts as its least
+// value. Two datetimes are equal if their microseconds and their bits are. Writing goes the way back and then puts the asterisks
+// over the unknown fields.
+//
+// Days are counted in years that begin on March 1, which puts the leap day at the end of a year, and in eras of 400 such years
+// with 146,097 days each. From the beginning of era 0 to 1970-01-01 there are 719,468 days.
+
 #include "host/TCIMDateTime.h"
 
 #include <array>
@@ -9,15 +22,15 @@ namespace {
 
 constexpr std::size_t kLength = 25;
 constexpr std::size_t kPoint = 14;         // the position of the decimal point
-constexpr std::size_t kMicroseconds = 15;  // and of the first digit behind it
-constexpr std::size_t kSign = 21;
+constexpr std::size_t kMicroseconds = 15;  // the position of the first digit behind it
+constexpr std::size_t kSign = 21;          // the position of the sign, or of an interval's colon
 constexpr unsigned int kFirstMicrosecondBit = 6;
 constexpr std::int64_t kSecond = 1000000;
 constexpr std::int64_t kMinute = 60 * kSecond;
 constexpr std::int64_t kHour = 60 * kMinute;
 constexpr std::int64_t kDay = 24 * kHour;
 
-/// One field of the text: where it stands, its bit among the unknown ones, and its range.
+/// A field of the text: its place, its bit if it is unknown, and its range.
 struct TField {
     std::size_t start;
     std::size_t length;
@@ -42,6 +55,7 @@ bool ReadDigits(std::string_view digits, std::int64_t& number) noexcept
     return true;
 }
 
+/// Sets the field's bit in `unknown` if it consists of asterisks.
 bool ReadField(std::string_view text, const TField& field, std::int64_t& number, std::uint16_t& unknown) noexcept
 {
     const std::string_view digits = text.substr(field.start, field.length);
@@ -81,12 +95,13 @@ std::int64_t GetDaysOfMonth(std::int64_t year, std::int64_t month) noexcept
     return month == 4 || month == 6 || month == 9 || month == 11 ? 30 : 31;
 }
 
-// Days since 1970-01-01 of a date of the Gregorian calendar, counted in years that begin in March and eras of 400 of them.
+/// The days from 1970-01-01 to a date of the Gregorian calendar; negative for an earlier date.
 std::int64_t GetDays(std::int64_t year, std::int64_t month, std::int64_t day) noexcept
 {
     year -= month <= 2 ? 1 : 0;
     const std::int64_t era = (year >= 0 ? year : year - 399) / 400;
     const std::int64_t yearOfEra = year - era * 400;
+    // From March on, five months have 153 days, again and again: 31, 30, 31, 30, 31.
     const std::int64_t dayOfYear = (153 * (month + (month > 2 ? -3 : 9)) + 2) / 5 + day - 1;
     return era * 146097 + yearOfEra * 365 + yearOfEra / 4 - yearOfEra / 100 + dayOfYear - 719468;
 }
@@ -97,6 +112,7 @@ struct TDate {
     std::int64_t day;
 };
 
+/// The inverse of GetDays.
 TDate GetDate(std::int64_t days) noexcept
 {
     days += 719468;
@@ -109,6 +125,7 @@ TDate GetDate(std::int64_t days) noexcept
     return {yearOfEra + era * 400 + (month <= 2 ? 1 : 0), month, dayOfYear - (153 * shifted + 2) / 5 + 1};
 }
 
+/// Adds the interval to `microseconds`, which has its fraction of a second already. ReadTimestamp does the same.
 bool ReadInterval(std::string_view text, std::int64_t& microseconds, std::uint16_t& unknown) noexcept
 {
     std::array<std::int64_t, kIntervalFields.size()> part{};
@@ -193,6 +210,7 @@ bool TCIMDateTime::Parse(std::string_view text, TCIMDateTime& result) noexcept
 std::string TCIMDateTime::ToText() const
 {
     const std::int64_t local = fMicroseconds + fOffset * kMinute;
+    // Before 1970 the division rounds up, but a day begins at the earlier midnight.
     std::int64_t days = local / kDay;
     std::int64_t rest = local % kDay;
     if (rest < 0) {

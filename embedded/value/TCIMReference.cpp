@@ -1,3 +1,13 @@
+// An object path: which class or instance of which namespace.
+//
+// A path is a pointer to counted contents: namespace and host, the class, and the key bindings in the order of their names in
+// lower case. Copies share the contents; an operation that changes a path first makes sure that no other path uses them (Own).
+//
+// The text is `//host/namespace:Class.Key="value",Other=5`. Text, datetimes, embedded objects and the paths of references are in
+// double quotes, char16 in single quotes. Only two characters are escaped, each by a backslash in front of it: the backslash and
+// the quote that is in use. Because bindings are sorted and escaped, paths with different bindings have different texts. That is
+// why a text can decide whether two references are equal and can be the key under which an instance is found.
+
 #include "host/TCIMReference.h"
 
 #include <algorithm>
@@ -15,8 +25,10 @@ namespace NORVZEL20 {
 
 namespace {
 
+// An estimate: a longer number only makes the text grow once.
 constexpr std::size_t kUsualNumberLength = 10;
 
+// For operations that return a reference. Never destroyed: paths may still be read while the process ends.
 const std::string& GetEmptyText()
 {
     static const std::string* const fgEmpty = new std::string;
@@ -31,7 +43,7 @@ TCIMReference::TCIMReference(TContents* contents) noexcept : fContents(contents)
 
 TCIMReference::TCIMReference(boost::shared_ptr<ICIMNamespace> ns, std::map<std::string, TCIMValue> keys) : fContents(nullptr)
 {
-    TCIMReference path(new TContents);  // owns the contents while they are filled
+    TCIMReference path(new TContents);  // frees the contents if something below throws
     if (ns) {
         TContents::TPlace& place = path.fContents->OwnPlace();
         place.ns = ns;
@@ -67,6 +79,7 @@ TCIMReference::~TCIMReference()
     }
 }
 
+/// The contents, used by this path alone and ready to be changed.
 TCIMReference::TContents& TCIMReference::Own()
 {
     if (fContents == nullptr) {
@@ -173,6 +186,7 @@ void TCIMReference::SetNamespaceName(const std::string& name)
 {
     std::string trimmed(Trim(name, "/"));
     TContents::TPlace& place = Own().OwnPlace();
+    // The namespace at hand has the old name, so it cannot be the one that is meant now.
     if (!TNameText::Equal(place.namespaceName, trimmed)) {
         place.ns.reset();
     }

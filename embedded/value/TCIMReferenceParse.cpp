@@ -1,3 +1,14 @@
+// Reads the text of an object path:
+//
+//     path     = [ "//" host "/" | "/" ] [ namespace ":" ] [ class ] [ "." binding *( "," binding ) | "=@" ]
+//     binding  = key "=" value
+//     value    = `"` text `"` | "'" character "'" | number | "TRUE" | "FALSE" | "NULL"
+//
+// In quotes a backslash makes the next character part of the text, whichever it is. A value without quotes ends at the next comma.
+// The namespace ends at the first colon; if an equals sign or a quote comes before it, the colon belongs to a value and there is
+// no namespace. A path without a class must have bindings, and no key may occur twice. "=@" marks the one instance of a class
+// without keys.
+
 #include <algorithm>
 #include <cstring>
 
@@ -11,10 +22,7 @@ namespace NORVZEL20 {
 
 namespace {
 
-// [ "//" host "/" | "/" ] [ namespace ":" ] [ class ] [ "." key "=" value { "," key "=" value } | "=@" ]
-//
-// A value is text in double quotes, a character in single quotes, or a word: a number, TRUE, FALSE or NULL. A path without a class
-// has keys. The end of the namespace is the first colon, unless an equals sign or a quote comes first.
+/// Reads a text from front to back. After a failure the position is that of the first wrong byte.
 class TPathReader {
   public:
     struct TBinding {
@@ -77,6 +85,7 @@ class TPathReader {
         fPosition = end + 1;
     }
 
+    /// Class names have no colon, so a colon in front of every binding ends a namespace.
     void ReadNamespace()
     {
         const std::size_t end = fText.find_first_of(":='\"", fPosition);
@@ -149,6 +158,8 @@ class TPathReader {
         }
     }
 
+    /// The text does not say which type a key has. A number gets the first of uint64, sint64 and real64 that can hold it; the store
+    /// converts it when it looks for the instance.
     bool ReadWord(TCIMValue& value)
     {
         const std::size_t end = std::min(fText.find(',', fPosition), fText.size());
@@ -166,6 +177,7 @@ class TPathReader {
                TValueText::Parse(TType::kReal64, word, value);
     }
 
+    /// Sorts all bindings at once, because inserting them one by one would take quadratic time for a path of many keys.
     void SortBindings()
     {
         std::stable_sort(fBindings.begin(), fBindings.end(),
@@ -187,6 +199,7 @@ class TPathReader {
     std::vector<TBinding> fBindings;
 };
 
+/// Null if the namespace does not declare the class.
 boost::shared_ptr<ICIMClass> FindClass(ICIMNamespace& ns, const std::string& name)
 {
     try {

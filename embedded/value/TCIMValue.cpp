@@ -1,3 +1,15 @@
+// A value takes 16 bytes, so that an instance can hold its values in a row:
+//
+//     byte         0     1     2                 3            8
+//     number       type  form  -                              64 bits
+//     datetime     type  form  offset, unknown fields, kind   microseconds
+//     short text   type  form  length            up to 13 bytes of text
+//     others       type  form  -                              pointer to a block that begins with TCounted
+//
+// A signed integer is sign-extended and a real32 is held as a double. Longer text, arrays, paths and embedded objects are in
+// blocks that never change, so a copy is 16 bytes and one more use of the block. A moved-from value is a null of its type. The
+// form says how to read the rest; TValueAccess lists the forms and has the unchecked access to them.
+
 #include "host/TCIMValue.h"
 
 #include <algorithm>
@@ -15,11 +27,13 @@ namespace NORVZEL20 {
 namespace {
 
 using TAccess = TValueAccess;
+/// The one failure of the accessors.
 [[noreturn]] void RefuseType()
 {
     throw TZELException(TZELStatusCode::kTypeMismatch);
 }
 
+/// Text is quoted inside of an array, because it may contain the separators.
 void AppendElement(std::string& out, const TCIMValue& element)
 {
     if (TAccess::IsText(element)) {
@@ -59,6 +73,7 @@ TCIMValue::TCIMValue(const TCIMValue& other) noexcept : fType(other.fType), fFor
 {
     std::memcpy(fBytes, other.fBytes, sizeof fBytes);
     if (IsShared()) {
+        // The empty path has no block.
         if (const TCounted* const block = TAccess::GetBlock(*this)) {
             block->Acquire();
         }
@@ -181,7 +196,7 @@ bool TCIMValue::IsNull() const noexcept
 TCIMValue::operator unsigned short() const
 {
     const bool isInteger = !IsNull() && TTypeKind::IsInteger(fType);
-    // A negative number, sign-extended, lies far beyond the range too.
+    // A negative number is sign-extended, so its bits exceed the range as well.
     if (!isInteger || TAccess::GetBits(*this) > std::numeric_limits<unsigned short>::max()) {
         RefuseType();
     }

@@ -1,3 +1,13 @@
+// Equality and hash of values.
+//
+// Nulls are equal, whatever their types. Other values of different types are different, even if their numbers are equal. Values of
+// the same type are compared by what they mean: -0 equals 0, every NaN equals every other, datetimes are equal if their instants
+// are. Equal values have the same hash.
+//
+// Bags are compared as multisets. Both are sorted by the hashes of their elements; if the sequences of hashes differ, the bags
+// differ. Otherwise each run of equal hashes on the left is paired off with the run on the right. Different elements rarely share
+// a hash, so a run is short or consists of equal elements, and the whole takes n log n steps.
+
 #include <algorithm>
 #include <cmath>
 #include <functional>
@@ -13,6 +23,7 @@ namespace {
 
 using TAccess = TValueAccess;
 
+/// True for two NaNs too, which the operator == of double denies.
 bool EqualReals(double a, double b) noexcept
 {
     return !(a < b) && !(a > b) && std::isnan(a) == std::isnan(b);
@@ -36,8 +47,8 @@ std::vector<THashed> SortByHash(const std::vector<TCIMValue>& elements)
     return result;
 }
 
-// Pairs off the elements of two runs of one hash; nearly always they are equal throughout, so that the first candidate is the right
-// one.
+/// Whether each element of a run equals an element of the other run, each used once. In runs of equal elements the first candidate
+/// always fits.
 bool PairOff(std::vector<THashed>::const_iterator first, std::vector<THashed>::const_iterator last,
              std::vector<THashed>::iterator candidates)
 {
@@ -72,6 +83,7 @@ bool EqualAsBags(const std::vector<TCIMValue>& a, const std::vector<TCIMValue>& 
     return true;
 }
 
+/// Depends on the order: a mix of a and b is not one of b and a.
 std::size_t Mix(std::size_t hash, std::size_t more) noexcept
 {
     return (hash ^ more) * 0x9E3779B97F4A7C15u + (more >> 29);
@@ -87,6 +99,7 @@ bool TCIMValue::operator==(const TCIMValue& other) const
     if (fType != other.fType) {
         return false;
     }
+    // The same bytes mean the same value, and the same block means the same contents.
     if (fForm == other.fForm && std::memcmp(fBytes, other.fBytes, sizeof fBytes) == 0) {
         return true;
     }
@@ -114,6 +127,7 @@ std::size_t TCIMValue::Hash() const
     case TAccess::kNull:
         return 0;
     case TAccess::kNumber:
+        // Any number will do for NaN; a tiny one hardly ever occurs.
         return TTypeKind::IsReal(fType) ? std::hash<double>()(std::isnan(GetReal()) ? 1e-300 : GetReal())
                                         : Mix(fType, static_cast<std::size_t>(TAccess::GetBits(*this)));
     case TAccess::kDateTime:

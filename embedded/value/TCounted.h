@@ -5,9 +5,9 @@
 
 namespace NORVZEL20 {
 
-/// The reference count that every shared block begins with. It starts at one: the maker's own use.
+/// The reference count at the beginning of every shared block. It starts at one, for the code that makes the block.
 ///
-/// Not polymorphic: whoever releases the last use knows the block's type and destroys it.
+/// Not polymorphic: the code that releases the last use knows the type of the block and destroys it.
 /// Threads: any, at any time.
 class TCounted {
   public:
@@ -17,7 +17,7 @@ class TCounted {
 
     void Acquire() const noexcept { fUses.fetch_add(1, std::memory_order_relaxed); }
 
-    /// True where that was the last use; the caller then destroys the block.
+    /// Returns true if that was the last use; the caller then destroys the block.
     bool Release() const noexcept { return fUses.fetch_sub(1, std::memory_order_acq_rel) == 1; }
 
     bool IsUnique() const noexcept { return fUses.load(std::memory_order_acquire) == 1; }

@@ -8,14 +8,14 @@
 
 namespace NORVZEL20 {
 
-/// The shared contents of an array value.
+/// The block of an array value.
 struct TCountedArray : TCounted {
     explicit TCountedArray(std::vector<TCIMValue> contents) : elements(std::move(contents)) {}
 
     const std::vector<TCIMValue> elements;
 };
 
-/// The shared contents of a string value that is an embedded object.
+/// The block of a string value that is an embedded object.
 struct TCountedObject : TCounted {
     explicit TCountedObject(boost::shared_ptr<const TEmbeddedObject> contents) : object(std::move(contents)) {}
 

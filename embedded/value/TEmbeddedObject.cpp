@@ -1,3 +1,12 @@
+// Equality of embedded objects by structure.
+//
+// Properties, qualifiers and methods have no order, so both sides are sorted by name and then compared pair by pair. Parameters
+// are compared in the order in which they are declared. In an instance, a null property says no more than a missing one, so nulls
+// are left out there; in a class they are declarations and count.
+//
+// The hash must not depend on the order either: it is a sum over the properties. An array may be a bag in one object and not in
+// the other, and the two may still be equal, so the elements of arrays are summed too.
+
 #include "embedded/value/TEmbeddedObject.h"
 
 #include <algorithm>
@@ -9,7 +18,7 @@ namespace NORVZEL20 {
 
 namespace {
 
-// Parts of objects, each by its name and contents.
+// These compare parts of an object by name and contents.
 bool Equal(const TEmbeddedObject::TQualifier& a, const TEmbeddedObject::TQualifier& b);
 bool Equal(const TEmbeddedObject::TProperty& a, const TEmbeddedObject::TProperty& b);
 bool Equal(const TEmbeddedObject::TMethod& a, const TEmbeddedObject::TMethod& b);
@@ -61,7 +70,7 @@ bool Equal(const TEmbeddedObject::TMethod& a, const TEmbeddedObject::TMethod& b)
            EqualSorted(SortByName(a.fQualifiers), SortByName(b.fQualifiers));
 }
 
-/// An array may be a bag here and none in the object it is compared with: whatever is equal then must agree.
+/// The same for arrays with the same elements in any order.
 std::size_t HashWithoutOrder(const TCIMValue& value)
 {
     if (value.IsNull() || !value.GetType().IsArray()) {
@@ -74,6 +83,7 @@ std::size_t HashWithoutOrder(const TCIMValue& value)
     return hash;
 }
 
+/// The properties that count, sorted by name.
 std::vector<const TEmbeddedObject::TProperty*> GetComparedProperties(const TEmbeddedObject& object)
 {
     auto properties = SortByName(object.GetProperties());
@@ -128,7 +138,6 @@ std::size_t TEmbeddedObject::Hash() const
 {
     std::size_t hash = TNameText::Hash(fClassName) + (fIsClass ? 1u : 0u);
     for (const TProperty& property : fProperties) {
-        // A sum, so that the order does not matter.
         hash += property.fValue.IsNull() ? 0 : TNameText::Hash(property.fName);
         hash += HashWithoutOrder(property.fValue) * 31;
     }

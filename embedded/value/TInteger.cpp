@@ -24,6 +24,7 @@ constexpr TIntegerRange kIntegerRanges[] = {kRangeOf<std::uint8_t>,  kRangeOf<st
 
 }  // namespace
 
+// Unsigned arithmetic negates the least number of a type too, which has no positive counterpart.
 TInteger TInteger::Read(const TCIMValue& value) noexcept
 {
     const std::uint64_t bits = TValueAccess::GetBits(value);

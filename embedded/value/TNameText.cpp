@@ -17,7 +17,7 @@ bool TNameText::Equal(std::string_view a, std::string_view b) noexcept
     if (a.size() != b.size()) {
         return false;
     }
-    // Names nearly always come in the spelling that they were declared in.
+    // Most names come in the spelling of their declaration.
     if (std::memcmp(a.data(), b.data(), a.size()) == 0) {
         return true;
     }
@@ -39,7 +39,8 @@ int TNameText::Compare(std::string_view a, std::string_view b) noexcept
 
 std::uint32_t TNameText::Hash(std::string_view name) noexcept
 {
-    std::uint64_t hash = 0xcbf29ce484222325u;  // FNV-1a, folded: names are short
+    // FNV-1a suits short texts. The two halves are combined because the lower bits alone mix poorly.
+    std::uint64_t hash = 0xcbf29ce484222325u;
     for (const char c : name) {
         hash = (hash ^ static_cast<unsigned char>(ToLower(c))) * 0x100000001b3u;
     }

@@ -9,7 +9,8 @@
 
 namespace NORVZEL20 {
 
-/// Names of classes, properties, qualifiers and namespaces: letter case does not count (ASCII letters alone), no locale involved.
+/// Names of classes, properties, qualifiers and namespaces. The letter case of ASCII letters does not matter. No locale is
+/// involved.
 class TNameText {
   public:
     TNameText() = delete;
@@ -24,12 +25,12 @@ class TNameText {
     /// Whether a name may go on with `c`: a digit or what IsNameStart accepts.
     static constexpr bool IsNamePart(char c) noexcept { return IsNameStart(c) || (c >= '0' && c <= '9'); }
     static bool Equal(std::string_view a, std::string_view b) noexcept;
-    /// Negative, zero or positive, as the lower-case forms compare byte for byte.
+    /// Negative, zero or positive, as the bytes of the lower-case forms compare.
     static int Compare(std::string_view a, std::string_view b) noexcept;
-    /// The same for names that are Equal; all 32 bits are of use.
+    /// The same for names that are Equal. All 32 bits are usable.
     static std::uint32_t Hash(std::string_view name) noexcept;
 
-    /// Functors for containers; TLess takes std::string_view for look-up too.
+    /// Functors for containers. TLess also allows look-up by std::string_view.
     struct TLess {
         using is_transparent = void;
         bool operator()(std::string_view a, std::string_view b) const noexcept { return Compare(a, b) < 0; }
@@ -42,11 +43,11 @@ class TNameText {
     };
 };
 
-/// Keyed by name and ordered by it; `find` takes any text without making a std::string.
+/// Keyed by name and ordered by it; `find` takes any text and makes no std::string.
 template <class T>
 using TNameMap = std::map<std::string, T, TNameText::TLess>;
 
-/// Keyed by a name that somebody else keeps (the value of the entry, say) and that must outlive the entry.
+/// Keyed by a name that the map does not own, such as that of the entry's value. The name must outlive the entry.
 template <class T>
 using TNameHashMap = std::unordered_map<std::string_view, T, TNameText::THash, TNameText::TEqual>;
 

@@ -12,7 +12,7 @@
 
 namespace NORVZEL20 {
 
-/// What a path holds. Most paths that an inventory stores name no namespace, so that part costs one pointer.
+/// The contents of a path. Most paths in an inventory have neither namespace nor host, so the two cost one pointer.
 struct TCIMReference::TContents : TCounted {
     using TBinding = std::pair<std::string, TCIMValue>;
 
@@ -22,7 +22,7 @@ struct TCIMReference::TContents : TCounted {
         std::string host;
     };
 
-    // Each level doubles the escapes of the one within, so that the text of a deep path would fill any memory.
+    // Each level doubles the backslashes of the level within: without a bound, the text of a deep path would fill any memory.
     static constexpr unsigned int kMaxDepth = 12;
 
     TContents() = default;
@@ -39,13 +39,13 @@ struct TCIMReference::TContents : TCounted {
         return *place;
     }
 
-    /// How deep references stand in `value`; 0 where there is none.
+    /// How deep references are nested in `value`; 0 if there is none.
     static unsigned int GetDepth(const TCIMValue& value);
 
     std::unique_ptr<TPlace> place;  // null: no namespace and no host
     boost::shared_ptr<ICIMClass> cls;
     std::vector<TBinding> bindings;  // in the order of the names in lower case
-    unsigned int depth = 0;          // how deep references stand in the bindings of references
+    unsigned int depth = 0;          // how deep references are nested in the bindings
 };
 
 }  // namespace NORVZEL20

@@ -11,6 +11,7 @@ const TSharedText* TSharedText::CreateRaw(std::string_view text)
     if (text.size() > std::numeric_limits<std::uint32_t>::max()) {
         throw std::bad_alloc();
     }
+    // The characters follow the object in the same block.
     void* memory = ::operator new(sizeof(TSharedText) + text.size());
     TSharedText* block = new (memory) TSharedText(static_cast<std::uint32_t>(text.size()));
     if (!text.empty()) {

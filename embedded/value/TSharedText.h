@@ -7,8 +7,8 @@
 
 namespace NORVZEL20 {
 
-/// Immutable text in one block of memory: count, length and characters. Whoever meets the same text again and again (a reader of
-/// inventories) makes one and hands it to many values.
+/// Immutable text in one block of memory: count, length and characters. A reader that meets the same text many times makes one
+/// block for all the values that hold it.
 ///
 /// Threads: any, at any time.
 class TSharedText : public TCounted {
@@ -17,12 +17,12 @@ class TSharedText : public TCounted {
 
     /// A copy of `text`. Errors: std::bad_alloc, also for 4 GiB and more.
     static TPointer Create(std::string_view text);
-    /// The same with the one use of the result left to the caller.
+    /// The same; the caller must give up the one use of the result with Drop.
     static const TSharedText* CreateRaw(std::string_view text);
     /// Gives up one use.
     static void Drop(const TSharedText* text) noexcept;
 
-    /// Valid while the block lives; no NUL behind it.
+    /// Valid while the block lives; no NUL follows.
     std::string_view GetText() const noexcept { return {reinterpret_cast<const char*>(this + 1), fLength}; }
 
   private:

@@ -8,11 +8,13 @@ namespace NORVZEL20 {
 
 namespace {
 
+/// For everything that would change the class.
 [[noreturn]] void Refuse()
 {
     throw TZELException(TZELStatusCode::kNotSupported);
 }
 
+/// For every look-up.
 [[noreturn]] void Miss()
 {
     throw TZELException(TZELStatusCode::kNotFound);

@@ -4,10 +4,11 @@
 
 namespace NORVZEL20 {
 
-/// Stands for a class that nobody declared: a name and nothing else.
+/// The class of a path whose class nobody declared: a name and nothing else.
 ///
-/// It is in no namespace, has no superclass, properties, instances or qualifiers. Looking one up throws status 15, enumerations
-/// call back never, whatever would change it throws status 31. Two are equal where their names are, as for every class.
+/// It is in no namespace and has no superclass, properties, methods, instances or qualifiers. Looking one up throws kNotFound (15),
+/// enumerations do not call back, and every change throws kNotSupported (31). Like all classes, two stubs are equal if their names
+/// are.
 class TStubClass : public ICIMClass {
   public:
     explicit TStubClass(std::string name);

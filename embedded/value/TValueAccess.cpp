@@ -45,6 +45,7 @@ TCIMValue TValueAccess::FromReal(TCIMValue::TCIMType type, double number) noexce
     return value;
 }
 
+// A path is nothing but a pointer to its contents, so the value's pointer can be read as a path.
 const TCIMReference& TValueAccess::GetPath(const TCIMValue& value) noexcept
 {
     return *std::launder(reinterpret_cast<const TCIMReference*>(value.fBytes + kPayload));
@@ -84,6 +85,7 @@ const TCounted* TValueAccess::AcquirePath(const TCIMReference& path) noexcept
     return path.fContents;
 }
 
+// TCounted is not polymorphic: the form says which block it is.
 void TValueAccess::DropBlock(const TCIMValue& value) noexcept
 {
     const TCounted* const block = GetBlock(value);

@@ -9,11 +9,10 @@
 
 namespace NORVZEL20 {
 
-/// The way behind the curtain of the value types, for this library alone: what a value holds, without checks, and making values
-/// without copying.
+/// Unchecked access to the contents of a value, for this library only.
 class TValueAccess {
   public:
-    /// How a value holds its contents. Everything from kSharedText on is a pointer to a block that begins with TCounted.
+    /// How a value holds its contents. From kSharedText on, that is a pointer to a block that begins with TCounted.
     enum EForm : unsigned char {
         kNull = 0,
         kNumber,      ///< boolean, integer, real or char16: 64 bits
@@ -23,34 +22,34 @@ class TValueAccess {
         kObject,      ///< TCountedObject
         kArray,       ///< TCountedArray
         kBag,         ///< TCountedArray, compared as a multiset
-        kPath         ///< TCIMReference's contents, a null pointer for the empty path
+        kPath         ///< the contents of a TCIMReference; a null pointer for the empty path
     };
     static constexpr std::size_t kShortTextSize = 13;
 
     static EForm GetForm(const TCIMValue& value) noexcept { return EForm(value.fForm); }
 
-    /// A string that shares `text`; short text is copied into the value instead. `text` must not be null.
+    /// A string that shares `text`, or has a copy of a short one. `text` must not be null.
     static TCIMValue FromSharedText(const TSharedText::TPointer& text) noexcept;
 
-    /// The text of a value in one of the two text forms.
+    /// The text of a value for which IsText is true.
     static std::string_view GetText(const TCIMValue& value) noexcept;
     static bool IsText(const TCIMValue& value) noexcept { return value.fForm == kShortText || value.fForm == kSharedText; }
 
-    /// The number of a value of form kNumber: signed integers sign-extended, reals as the bits of a double, char16 as its unit.
+    /// The bits of a value of form kNumber: a signed integer sign-extended, a real as a double, a char16 as its unit.
     static std::uint64_t GetBits(const TCIMValue& value) noexcept { return Load<std::uint64_t>(value); }
     /// The number of a real.
     static double GetReal(const TCIMValue& value) noexcept { return Load<double>(value); }
-    /// A value of the non-array type `type`, which must be one that form kNumber serves; `bits` as in GetBits, in range.
+    /// A value of form kNumber. `type` must be boolean, an integer, a real or char16; `bits` are as in GetBits and in range.
     static TCIMValue FromBits(TCIMValue::TCIMType type, std::uint64_t bits) noexcept;
     static TCIMValue FromReal(TCIMValue::TCIMType type, double number) noexcept;
 
-    /// The path of a value of form kPath, without a copy of it: valid while the value lives unchanged.
+    /// The path of a value of form kPath, without a copy. Valid until the value changes.
     static const TCIMReference& GetPath(const TCIMValue& value) noexcept;
 
   private:
     friend class TCIMValue;
 
-    // A number or pointer stands at offset 8 of the value, which is aligned to 8.
+    // A number or a pointer is at offset 8 of the value, which is aligned to 8.
     static constexpr std::size_t kPayload = 6;
 
     template <class T>

@@ -1,3 +1,10 @@
+// Values from their text in CIM-XML, and back.
+//
+// Reading follows DSP0201 and is strict: a number must fill the whole text and fit the type's range, and only signed types accept a
+// minus. Numbers go through std::from_chars and std::to_chars, which know no locale and read back exactly what they wrote. Two
+// things are done here because the library does them differently: INF and NaN have CIM's names, and a real that is too close to
+// zero for its type is rounded, while the library treats it like one that is too large.
+
 #include "embedded/value/TValueText.h"
 
 #include <charconv>
@@ -21,9 +28,11 @@ using TType = TCIMValue::TCIMType;
 
 constexpr std::string_view kBlanks = " \t\r\n";
 
+// By type code.
 constexpr const char* kTypeNames[] = {"",       "boolean", "uint8",  "sint8",  "uint16", "sint16", "uint32",   "sint32",
                                       "uint64", "sint64",  "real32", "real64", "char16", "string", "datetime", "reference"};
 
+/// Reads a number that must end where the digits end.
 template <class T>
 bool ReadAll(std::string_view digits, T& number, int base)
 {
@@ -56,6 +65,7 @@ bool ParseInteger(TType::ECIMType type, std::string_view text, TCIMValue& result
     return isRead && number.Make(type, result);
 }
 
+/// Reads INF, -INF and NaN.
 bool ReadNamedReal(std::string_view text, double& number)
 {
     if (TNameText::Equal(text, "NaN")) {
@@ -70,7 +80,8 @@ bool ReadNamedReal(std::string_view text, double& number)
     return TNameText::Equal(text, "INF");
 }
 
-// Whether a number that is out of range is too small for the type rather than too large; it then becomes 0, or the least number.
+/// Rounds a real that is out of the type's range because it is too close to zero: to 0 or to the smallest number. Returns false for
+/// one that is too large, and for one that even long double cannot hold.
 template <class T>
 bool RoundsToZero(std::string_view text, T& number)
 {
@@ -88,7 +99,7 @@ bool ReadReal(std::string_view text, T& number)
 {
     const bool hasSign = !text.empty() && (text[0] == '+' || text[0] == '-');
     const char first = text.size() > (hasSign ? 1u : 0u) ? text[hasSign ? 1 : 0] : '\0';
-    // The library's own words for infinity and not-a-number are more than CIM has, and its numbers have no plus sign.
+    // The library also accepts words that CIM does not have ("infinity", "nan(1)"), and does not accept a plus sign.
     if (first != '.' && (first < '0' || first > '9')) {
         return false;
     }
@@ -120,7 +131,7 @@ bool ParseChar16(std::string_view text, TCIMValue& result)
     if (text.empty()) {
         return false;
     }
-    // A unit may be half of a surrogate pair, so only overlong forms are refused.
+    // Half of a surrogate pair is a valid unit. Only overlong forms are refused.
     const TUtf8::TCharacter character = TUtf8::Decode(text);
     if (character.length != text.size() || character.code > 0xFFFF || character.IsOverlong()) {
         return false;
@@ -218,7 +229,8 @@ void TValueText::AppendQuoted(std::string& out, std::string_view text, char quot
     AppendQuotedBy(out, quote, [text](std::string& to) { to += text; });
 }
 
-// Counts first, then moves the characters to their places from the end on: linear, and nothing at all for ordinary text.
+// Counts the escapes and then moves the characters to their places, beginning at the end. That is linear, and text without escapes
+// is not touched.
 void TValueText::EscapeFrom(std::string& out, std::size_t start, char quote)
 {
     std::size_t escapes = 0;
@@ -241,7 +253,7 @@ void TValueText::EscapeFrom(std::string& out, std::size_t start, char quote)
 
 void TValueText::AppendUnsigned(std::string& out, std::uint64_t number)
 {
-    char digits[20];
+    char digits[20];  // the longest is 18446744073709551615
     out.append(digits, std::to_chars(digits, digits + sizeof digits, number).ptr);
 }
 

@@ -8,23 +8,34 @@
 
 namespace NORVZEL20 {
 
-/// The text forms of values, without any locale.
+/// The text forms of values. They do not depend on a locale.
 class TValueText {
   public:
     TValueText() = delete;
 
     /// Reads `text` as a value of the non-array type `type`, as CIM-XML writes them (DSP0201, 5.2.4 "VALUE").
     ///
-    /// Booleans TRUE and FALSE in any letter case; integers in decimal or 0x hexadecimal, with an optional sign ("-" for signed
-    /// types alone), within the type's range; reals in decimal with optional exponent, INF, -INF, NaN in any letter case, rounded
-    /// to the type and within its range; char16 exactly one UCS-2 unit in UTF-8; datetimes of 25 characters; strings as they are.
-    /// White space around is left out for all but strings and char16. Returns false, and leaves `result` as it is, for everything
-    /// else, references and arrays included.
+    /// - boolean: TRUE or FALSE in any letter case
+    /// - integer: decimal, or hexadecimal after 0x, within the type's range; a sign is optional, "-" only for signed types
+    /// - real: decimal with an optional exponent, within the type's range and rounded to the type; INF, -INF or NaN in any letter
+    /// case
+    /// - char16: one UCS-2 unit in UTF-8
+    /// - datetime: 25 characters
+    /// - string: the text as it is
+    ///
+    /// White space around the text is ignored, except for strings and char16. Returns false, and leaves `result` as it is, for
+    /// every other text and for references and arrays.
     static bool Parse(TCIMValue::TCIMType type, std::string_view text, TCIMValue& result);
 
-    /// Gives `value` the type `type` where that loses nothing: itself where it has the type already, nulls, integers to integers
-    /// within range, integers and reals to reals that hold them exactly, text to whatever Parse reads from it and to references,
-    /// char16, datetimes and references to text, arrays element by element. Returns false, and leaves `result` as it is, otherwise.
+    /// Converts `value` to the type `type` if nothing is lost:
+    ///
+    /// - a null, and a value that has the type already
+    /// - an integer to an integer type whose range includes it, a number to a real type that holds it exactly
+    /// - text to a reference, or to whatever Parse reads from it
+    /// - char16, datetime and reference to text
+    /// - an array to an array, element by element; a bag stays a bag
+    ///
+    /// Returns false, and leaves `result` as it is, for everything else.
     static bool Convert(const TCIMValue& value, TCIMValue::TCIMType type, TCIMValue& result);
 
     /// The name of a type in CIM-XML: "uint16" for the type and for arrays of it, "reference", "" for kNone.
@@ -34,11 +45,11 @@ class TValueText {
     /// The element type of that name in lower case ("reference" included); kNone if no type has that name.
     static TCIMValue::TCIMType FindType(std::string_view name) noexcept;
 
-    /// Appends a non-null boolean, number, char16, text or datetime as it is, unquoted and unescaped.
+    /// Appends a boolean, number, char16, text or datetime, unquoted and unescaped. The value must not be null.
     static void AppendPlain(std::string& out, const TCIMValue& value);
-    /// Appends `text` between two `quote` characters, with `quote` and `\` escaped by `\`.
+    /// Appends `text` between two `quote` characters, with a `\` in front of each `quote` and `\`.
     static void AppendQuoted(std::string& out, std::string_view text, char quote);
-    /// The same for text that `write(out)` appends itself.
+    /// The same for the text that `write(out)` appends.
     template <class TWriter>
     static void AppendQuotedBy(std::string& out, char quote, const TWriter& write)
     {
@@ -50,7 +61,7 @@ class TValueText {
     }
     static void AppendUnsigned(std::string& out, std::uint64_t number);
     static void AppendSigned(std::string& out, std::int64_t number);
-    /// The shortest text that reads back as the same double (for real32: as the same float); INF, -INF, NaN.
+    /// The shortest text that reads back as the same double, or as the same float for real32; INF, -INF, NaN.
     static void AppendReal(std::string& out, double number, bool isReal32);
 
   private:

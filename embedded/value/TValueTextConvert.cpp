@@ -13,6 +13,7 @@ namespace {
 
 using TType = TCIMValue::TCIMType;
 
+/// A number becomes a real only if the real is exactly that number.
 bool ConvertToReal(const TCIMValue& value, TType::ECIMType type, TCIMValue& result)
 {
     double number = 0;
@@ -21,7 +22,7 @@ bool ConvertToReal(const TCIMValue& value, TType::ECIMType type, TCIMValue& resu
     } else {
         const TInteger integer = TInteger::Read(value);
         number = static_cast<double>(integer.magnitude);
-        // 2^64 itself would not convert back.
+        // The bound is checked first, because 2^64 cannot be converted back.
         if (number >= 0x1p64 || static_cast<std::uint64_t>(number) != integer.magnitude) {
             return false;
         }

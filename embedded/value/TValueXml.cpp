@@ -1,3 +1,15 @@
+// Values, paths and embedded objects as CIM-XML elements (DSP0201), appended to a text.
+//
+//     value            element
+//     simple           VALUE
+//     reference        VALUE.REFERENCE with the path's element
+//     array            VALUE.ARRAY of VALUE and VALUE.NULL, or VALUE.REFARRAY of VALUE.REFERENCE and VALUE.NULL
+//     null             nothing; inside of an array VALUE.NULL
+//     embedded object  VALUE with its INSTANCE or CLASS element as escaped text
+//
+// A path's element says as much as the path knows: host and namespace (NAMESPACEPATH), the namespace alone (LOCALNAMESPACEPATH) or
+// neither, and then an instance or, without keys, a class. Attributes that have their default value are left out.
+
 #include "embedded/value/TValueXml.h"
 
 #include <algorithm>
@@ -15,7 +27,7 @@ using TAccess = TValueAccess;
 using TType = TCIMValue::TCIMType;
 using TObject = TEmbeddedObject;
 
-// Reals carry a decimal point in CIM-XML, whatever their size.
+/// CIM-XML requires a decimal point in every real.
 void AppendRealWithPoint(std::string& out, const TCIMValue& value)
 {
     const std::size_t start = out.size();
@@ -99,6 +111,7 @@ void AppendClassName(std::string& out, const TCIMReference& path)
     out += "/>";
 }
 
+/// The attribute VALUETYPE, which is coarser than a type.
 const char* GetKeyKind(TType type)
 {
     switch (TType::ECIMType(type)) {
@@ -135,6 +148,7 @@ void AppendKeyBinding(std::string& out, const std::pair<std::string, TCIMValue>&
     out += "</KEYBINDING>";
 }
 
+/// A null without a type has to be written with some type.
 const char* GetWrittenType(TType type)
 {
     const char* const name = TValueText::GetTypeName(type);
@@ -163,7 +177,7 @@ void AppendOrigin(std::string& out, const std::string& classOrigin, bool propaga
     AppendFlag(out, "PROPAGATED", propagated, false);
 }
 
-// The attributes that tell the type of a property or parameter whose element is named for its kind.
+/// The type of a property or parameter. The name of its element already says whether it is a reference or an array.
 void AppendTypeAttributes(std::string& out, TType type, const std::string& referenceClass, unsigned int arraySize)
 {
     if (TType::ECIMType(type.GetElementType()) == TType::kReference) {
@@ -178,6 +192,7 @@ void AppendTypeAttributes(std::string& out, TType type, const std::string& refer
     }
 }
 
+/// The element's name for the type, such as PROPERTY.ARRAY.
 std::string GetKindName(const char* base, TType type)
 {
     const bool isReference = TType::ECIMType(type.GetElementType()) == TType::kReference;
@@ -189,7 +204,8 @@ const TObject* AsObject(const TCIMValue& value)
     return TAccess::GetForm(value) == TAccess::kObject ? value.GetEmbeddedObject().get() : nullptr;
 }
 
-// An object in the value, where there is one and all other text is empty: a reader takes what is marked for objects alone.
+/// The embedded object, or the first one of an array. Null if there is other text too: the attribute EmbeddedObject would make a
+/// reader take all of it for objects.
 const TObject* FindObject(const TCIMValue& value)
 {
     if (value.IsNull() || TType::ECIMType(value.GetType()) != TType::kArrayString) {

@@ -1,3 +1,7 @@
+// Escaping for CIM-XML. Text comes in runs of plain ASCII, which are appended as a whole; between them, one character at a time is
+// copied, escaped, or replaced by U+FFFD if XML 1.0 does not allow it. The result can always be parsed, whatever bytes a value
+// holds.
+
 #include "embedded/value/TUtf8.h"
 #include "embedded/value/TValueXml.h"
 
@@ -15,12 +19,14 @@ std::size_t GetXmlLength(std::string_view text)
     return character.IsOverlong() || !character.IsScalar() || isForbidden ? 0 : character.length;
 }
 
+/// Whether `c` is copied as it is, in attributes too.
 bool IsPlain(char c)
 {
     const auto byte = static_cast<unsigned char>(c);
     return byte >= 0x20 && byte < 0x80 && c != '&' && c != '<' && c != '>' && c != '"';
 }
 
+/// Attributes need more escapes: a parser turns their tabs and line breaks into blanks.
 void AppendSpecial(std::string& out, char c, bool isAttribute)
 {
     switch (c) {
