@@ -1,5 +1,5 @@
-// The one operation of an in-memory namespace that needs the query language. It is defined here, so that the store does not depend
-// on it.
+// The one operation of an in-memory namespace that needs the query language. It is defined here because the store must not depend
+// on the query language.
 
 #include "embedded/query/TQuery.h"
 #include "embedded/store/TInMemNamespace.h"

@@ -1,3 +1,12 @@
+// Patterns of LIKE.
+//
+// A pattern is cut into steps: any text (%), any character (_), one of a set of characters, or none of a set. A character that
+// means itself is a set of one. Text and pattern are decoded first, so a step always stands for one character of UTF-8.
+//
+// Matching walks along the text and the steps at once. A % matches nothing at first. If a later step fails, the walk goes back to
+// the last % and lets it take one character more. Going back to an earlier % is never needed: whatever it could skip, the last one
+// can skip too. That bounds the work by the product of both lengths.
+
 #include "embedded/query/TLikePattern.h"
 
 #include <algorithm>
@@ -28,7 +37,7 @@ std::vector<char32_t> Decode(std::string_view text)
 TLikePattern::TLikePattern(std::string_view pattern)
 {
     const std::vector<char32_t> characters = Decode(pattern);
-    bool canClose = true;  // whether a bracket may still be closed: where one is not, neither are those behind it
+    bool canClose = true;  // once a bracket is not closed, no later one can be: this spares the search for its end
     for (std::size_t at = 0; at < characters.size();) {
         const char32_t character = characters[at];
         const bool opens = character == U'[' && canClose;
@@ -49,7 +58,8 @@ TLikePattern::TLikePattern(std::string_view pattern)
     }
 }
 
-/// Reads a set whose bracket stands in front of `at`; the position behind its second bracket, or 0 where there is none.
+/// Reads the set whose opening bracket is in front of `at`. Returns the position behind its closing bracket, or 0 if it has none.
+/// A closing bracket that comes first is part of the set.
 std::size_t TLikePattern::ReadSet(const std::vector<char32_t>& pattern, std::size_t at)
 {
     const bool isInverted = at < pattern.size() && pattern[at] == U'^';
@@ -83,8 +93,8 @@ bool TLikePattern::Matches(std::string_view text) const
     const std::vector<char32_t> characters = Decode(text);
     std::size_t step = 0;
     std::size_t at = 0;
-    std::size_t retryStep = fSteps.size();  // behind the last % so far, from which to go on one character later
-    std::size_t retryAt = 0;
+    std::size_t retryStep = fSteps.size();  // the step behind the last % so far
+    std::size_t retryAt = 0;                // the end of what that % matches so far
     bool canRetry = false;
     while (at < characters.size() || step < fSteps.size()) {
         if (step < fSteps.size() && fSteps[step].kind == TStep::kAnyText) {

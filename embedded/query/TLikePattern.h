@@ -8,13 +8,13 @@
 namespace NORVZEL20 {
 
 /// A pattern of the operator LIKE: % stands for any text, _ for one character, [a-z] for one of the characters, [^a-z] for any
-/// other. Whatever stands in brackets alone means itself: [%] is a percent sign. A bracket that is not closed means itself too.
+/// other. A single character in brackets means itself: [%] is a percent sign. A bracket that is not closed means itself too.
 class TLikePattern {
   public:
-    /// UTF-8; bytes that are not count as one character each. Cost: in proportion to the pattern.
+    /// The pattern is in UTF-8; a byte that is not UTF-8 counts as one character. Cost: linear.
     explicit TLikePattern(std::string_view pattern);
 
-    /// Whether the whole of `text` fits. Letter case counts. At most the product of both lengths in steps.
+    /// Whether the pattern fits the whole of `text`. Letter case matters. Cost: at most the product of both lengths.
     bool Matches(std::string_view text) const;
 
   private:
@@ -25,6 +25,7 @@ class TLikePattern {
         std::vector<std::pair<char32_t, char32_t>> ranges;  ///< first and last of each
     };
 
+    /// For a step that takes one character.
     static bool Fits(const TStep& step, char32_t character);
     std::size_t ReadSet(const std::vector<char32_t>& pattern, std::size_t at);
 

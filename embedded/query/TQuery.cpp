@@ -1,3 +1,11 @@
+// A query is parsed once, and then run in three steps:
+//
+//  1. Find the class and its subclasses, and check that each property of the query is declared in one of them.
+//  2. Bind the condition to each class. This finds the slots of the properties and checks that their types allow the tests.
+//  3. Visit the instances class by class and call back for those that the condition is true for.
+//
+// All errors are reported in the first two steps, before the first callback.
+
 #include "embedded/query/TQuery.h"
 
 #include <algorithm>
@@ -15,6 +23,7 @@ namespace {
 
 using TClasses = std::vector<boost::shared_ptr<TInMemClass>>;
 
+/// A property of a subclass is enough: instances of other classes have a NULL in its place.
 void RequireProperty(const TClasses& classes, const std::string& name, std::size_t position)
 {
     const bool isDeclared = std::any_of(classes.begin(), classes.end(), [&name](const boost::shared_ptr<TInMemClass>& cls) {
@@ -53,7 +62,7 @@ TQuery::~TQuery() = default;
 
 void TQuery::Execute(TInMemNamespace& ns, const boost::function<bool(boost::shared_ptr<ICIMInstance>)>& callback) const
 {
-    const auto keep = ns.shared_from_this();
+    const auto keep = ns.shared_from_this();  // the callback may release the last use of the namespace
     TClasses classes{ns.FindClass(fClassName)};
     if (!classes[0]) {
         throw TQueryError(TZELStatusCode::kNotFound, "there is no class '" + fClassName + "'", fClassPosition);

@@ -13,7 +13,7 @@ namespace NORVZEL20 {
 class TInMemNamespace;
 struct TQueryCondition;
 
-/// A query in WQL (or the basic level of CQL, DSP0202), parsed once and answered by any namespace.
+/// A query in WQL, or in the basic level of CQL (DSP0202). It is parsed once and can be run on any namespace.
 ///
 ///     query     = "SELECT" ( "*" | name *( "," name ) ) "FROM" name [ "WHERE" or ]
 ///     or        = and *( "OR" and )
@@ -23,28 +23,34 @@ struct TQueryCondition;
 ///               | operand "IS" [ "NOT" ] "NULL" | operand "ISA" ( name | text )
 ///     operand   = name | text | number | "TRUE" | "FALSE" | "NULL"
 ///
-/// Key words and names may be written in any letter case; a name may have the class's in front (`Disk.Size`). Text stands in single
-/// or double quotes, a quote or backslash within it behind a backslash. LIKE knows % (any text), _ (one character), [a-z] and
-/// [^a-z]. The answer holds whole instances, of the class and its subclasses, also where the query lists properties; a listed
-/// property must be declared. A test with a NULL is neither true nor false, and so is its NOT; only IS NULL finds NULLs. Text
-/// compares byte for byte, numbers by value whatever their types, datetimes as instants (asterisks: not true), references by path
-/// text. ISA asks for the class of an embedded object or a reference, or, with the class's own name in front, of the instance.
-/// Arrays can be tested for NULL alone.
+/// Words:   Key words and names may have any letter case. A name may follow that of the class (`Disk.Size`). Text is in single or
+///          double quotes, with a backslash in front of a quote or backslash within. LIKE takes a TLikePattern.
+/// Answer:  Whole instances of the class and its subclasses, even if the query lists properties. Listed properties must be
+/// declared. NULL:    A test with a NULL is neither true nor false, and so is its NOT. Only IS NULL finds NULLs. Values:  Text
+/// compares byte for byte, numbers by value whatever their types, references by path text, datetimes as instants; a
+///          test with asterisks in a datetime is neither true nor false. Arrays can only be tested for NULL.
+/// ISA:     The left side is a reference or an embedded object, whose class is tested, or the name of the query's class for the
+///          class of the instance itself.
+///
+/// Threads: as for the namespace that the query runs on.
 class TQuery {
   public:
-    /// `language` is "WQL" or "DMTF:CQL", in any letter case. Errors: TQueryError with status 16 or 17.
+    /// `language` is "WQL" or "DMTF:CQL", in any letter case.
+    /// Errors: TQueryError with kInvalidQuery (16) or kQueryLanguageUnknown (17).
     TQuery(const std::string& language, const std::string& text);
     TQuery(const TQuery&) = delete;
     TQuery& operator=(const TQuery&) = delete;
     ~TQuery();
 
     const std::string& GetClassName() const noexcept { return fClassName; }
-    /// The listed properties as written; empty for "*".
+    /// The listed properties in the spelling of the query; empty for "*".
     const std::vector<std::string>& GetProperties() const noexcept { return fProperties; }
 
-    /// Calls back for each instance that answers, class by class (the class itself, then each subclass with all below it), in order
-    /// of insertion, until the callback returns false. Errors: TQueryError with status 15 where the class, or a property in the
-    /// class and all below it, is not declared, 16 for a test that the property's type does not allow.
+    /// Calls back with each instance of the answer until the callback returns false: class by class, first the class itself, then
+    /// each subclass followed by those below it; the instances of a class in order of insertion.
+    /// Errors: TQueryError with kNotFound (15) for a class that is not declared and for a property that neither the class nor any
+    /// class below it declares, kInvalidQuery (16) for a test that a property's type does not allow. No instance has been passed
+    /// to the callback then.
     void Execute(TInMemNamespace& ns, const boost::function<bool(boost::shared_ptr<ICIMInstance>)>& callback) const;
 
   private:

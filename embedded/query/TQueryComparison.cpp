@@ -1,3 +1,9 @@
+// How the values of a query compare.
+//
+// A query's literals have few types, so types need not be equal: all numbers compare with each other, and a text literal compares
+// with char16, datetimes and references too. Numbers are compared as long double, which holds every CIM number exactly. A result
+// is unknown if a value does not say enough: a null, an embedded object, a datetime with asterisks.
+
 #include "embedded/query/TQueryComparison.h"
 
 #include "embedded/value/TTypeKind.h"
@@ -10,13 +16,13 @@ namespace {
 
 using TType = TCIMValue::TCIMType;
 
-/// Types whose values can be written as a text literal.
+/// Whether values of the type can be written as a text literal.
 bool IsTextual(TType type)
 {
     return type == TType::kString || type == TType::kChar16 || type == TType::kDateTime || type == TType::kReference;
 }
 
-/// Exact for every number: the significand of a long double has 64 bits at least.
+/// Exact for every number, because the significand of a long double has at least 64 bits here.
 long double GetNumber(const TCIMValue& value)
 {
     if (TTypeKind::IsReal(value.GetType())) {

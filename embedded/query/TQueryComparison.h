@@ -14,16 +14,16 @@ class TQueryComparison {
         kLess,
         kEqual,
         kGreater,
-        kUnordered,  ///< different, and neither is the less: a NaN, FALSE and TRUE
+        kUnordered,  ///< different, but neither is less: NaN and a number, FALSE and TRUE
         kUnknown     ///< a null, an embedded object, a datetime with asterisks
     };
 
-    /// Whether values of the two types compare at all; kNone stands for any. A text literal compares with what it can be read as,
-    /// which IsReadable tells.
+    /// Whether values of the two types can be compared; kNone stands for any type. For a text literal and a datetime, IsReadable
+    /// must be true as well.
     static bool AreComparable(TCIMValue::TCIMType a, TCIMValue::TCIMType b);
-    /// Whether values of the types have an order, beyond being equal or not.
+    /// Whether values of the types have an order, besides being equal or not.
     static bool AreOrdered(TCIMValue::TCIMType a, TCIMValue::TCIMType b);
-    /// Whether a text literal reads as a value of `type`.
+    /// Whether a literal can be read as a value of `type`. Only a text for a datetime may be unreadable.
     static bool IsReadable(const TCIMValue& literal, TCIMValue::TCIMType type);
 
     /// Compares values of comparable types.

@@ -10,30 +10,30 @@
 
 namespace NORVZEL20 {
 
-/// One side of a test: a property, or a literal.
+/// One side of a test: a property or a literal.
 struct TQueryOperand {
-    std::string name;      ///< of the property; empty for a literal
+    std::string name;      ///< the property; empty for a literal
     TCIMValue literal;     ///< string, uint64, sint64, real64, boolean or null
-    std::size_t position;  ///< in the query's text
-    std::size_t ordinal;   ///< counts the properties that the condition mentions
-    bool isClass = false;  ///< the class of the query itself, which ISA may ask for
+    std::size_t position;  ///< byte offset in the query's text
+    std::size_t ordinal;   ///< the number of properties in front of this one in the condition
+    bool isClass = false;  ///< whether this is the name of the query's class, in front of ISA
 };
 
-/// A condition of a query, as parsed; it knows no class yet.
+/// A condition of a query, as a tree. It is not bound to a class yet (see TQueryMatcher).
 struct TQueryCondition {
     enum EKind {
-        kOr,   ///< over parts
-        kAnd,  ///< over parts
-        kNot,  ///< of the one in parts
-        kEqual,
+        kOr,     ///< of all parts
+        kAnd,    ///< of all parts
+        kNot,    ///< of parts[0]
+        kEqual,  ///< this and the next five compare operands[0] with operands[1]
         kNotEqual,
         kLess,
         kLessOrEqual,
         kGreater,
         kGreaterOrEqual,
         kLike,    ///< operands[0] and pattern
-        kIsNull,  ///< of operands[0]
-        kIsA      ///< of operands[0] and className
+        kIsNull,  ///< operands[0]
+        kIsA      ///< operands[0] and className
     };
 
     TQueryCondition(EKind ofKind, std::size_t at) noexcept : kind(ofKind), position(at) {}

@@ -7,17 +7,18 @@
 
 namespace NORVZEL20 {
 
-/// A query that cannot be answered: status 16 for a bad text, 17 for an unknown language, 15 for an unknown class or property.
+/// A query that cannot be answered: kInvalidQuery (16) for its text, kQueryLanguageUnknown (17) for its language, kNotFound (15)
+/// for an unknown class or property.
 class TQueryError : public TZELException {
   public:
-    /// `position` counts bytes from 0.
+    /// `position` is a byte offset, counted from 0.
     TQueryError(TZELStatusCode status, const std::string& message, std::size_t position);
 
-    /// The whole text, such as "query, column 15: expected FROM, found 'FORM'".
+    /// The message with the position, such as "query, column 15: expected FROM, found 'FORM'".
     const char* what() const noexcept override { return fText.c_str(); }
-    /// Without the position.
+    /// The message without the position.
     const std::string& GetMessage() const noexcept { return fMessage; }
-    /// The byte of the query, counted from 0, where the trouble begins.
+    /// The byte offset of the error in the query, counted from 0.
     std::size_t GetPosition() const noexcept { return fPosition; }
 
   private:

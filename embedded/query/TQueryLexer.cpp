@@ -1,3 +1,13 @@
+// Cuts a query into tokens. The first character decides what a token is:
+//
+//     letter, _, beyond ASCII      a name or a key word; the parser knows which
+//     digit, or sign or point      a number; everything that can belong to one is taken, and the parser finds out if it is one
+//     with a digit behind it
+//     ' or "                       a text up to the same quote; a backslash escapes quotes and backslashes, and is itself elsewhere
+//     = <> != < <= > >= ( ) , . *  a symbol; the longest one counts
+//
+// Blanks, tabs and line breaks between tokens are ignored.
+
 #include "embedded/query/TQueryLexer.h"
 
 #include "embedded/query/TQueryError.h"
@@ -53,7 +63,7 @@ TQueryToken TQueryLexer::ReadName()
     return TQueryToken{TQueryToken::kName, fText.substr(begin, fAt - begin), begin};
 }
 
-/// Takes whatever may belong to a number; whether it is one, its reader tells.
+/// A sign within belongs to an exponent; a hexadecimal number has none, so its e is a digit.
 TQueryToken TQueryLexer::ReadNumber()
 {
     const std::size_t begin = fAt;

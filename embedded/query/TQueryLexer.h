@@ -12,8 +12,8 @@ class TQueryLexer {
     /// The text must outlive the lexer.
     explicit TQueryLexer(const std::string& text) noexcept : fText(text) {}
 
-    /// The next token; kEnd again and again behind the last. Errors: TQueryError with status 16 for a literal without its second
-    /// quote and for a character that no token begins with.
+    /// The next token; after the last one always kEnd.
+    /// Errors: TQueryError with kInvalidQuery (16) for a text without its closing quote and for a character that begins no token.
     TQueryToken Next();
 
   private:

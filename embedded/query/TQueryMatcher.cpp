@@ -1,3 +1,12 @@
+// Evaluates a condition for an instance, in three-valued logic: true, unknown and false.
+//
+// A test is unknown if a value does not say enough (see TQueryComparison). OR is as true as its truest part, AND as its least true
+// part, and NOT swaps true and false and leaves unknown. An instance is part of the answer only if the whole condition is true. So
+// `Size = 5` and `NOT Size = 5` both leave out an instance whose Size is NULL.
+//
+// Whatever depends on the class alone is done once, when the matcher is made: finding the slots of the properties, and refusing
+// tests that the types of the properties do not allow.
+
 #include "embedded/query/TQueryMatcher.h"
 
 #include <algorithm>
@@ -16,6 +25,7 @@ namespace {
 
 using TType = TCIMValue::TCIMType;
 
+/// An operand and its type for a message, such as "'Size' (uint64)".
 std::string Describe(const TQueryOperand& operand, TType type)
 {
     const std::string name = operand.name.empty() ? "the value" : "'" + operand.name + "'";
@@ -192,7 +202,7 @@ TQueryMatcher::ETruth TQueryMatcher::EvaluateIsA(const TQueryCondition& test, co
     return object && IsA(object->GetClassName(), test.className) ? kTrue : kFalse;
 }
 
-/// Whether the class named, which need not be declared, is the wanted one or below it.
+/// Whether the class of that name is the wanted one or below it. A class that is not declared has only its name.
 bool TQueryMatcher::IsA(std::string_view className, std::string_view wanted) const
 {
     const auto ns = fClass.GetInMemNamespace();

@@ -8,18 +8,19 @@
 
 namespace NORVZEL20 {
 
-/// A condition bound to one class: knows the slots of the properties and has checked that their types allow the tests.
+/// A condition bound to one class: it has the slots of the properties, and their types allow the tests.
 class TQueryMatcher {
   public:
-    /// A property that `cls` does not declare counts as NULL (a subclass may have it; see TQuery). Both must outlive the matcher.
-    /// Errors: TQueryError with status 16 for a test that a type does not allow.
+    /// Both must outlive the matcher. A property that `cls` does not declare counts as NULL, because another class of the query may
+    /// declare it.
+    /// Errors: TQueryError with kInvalidQuery (16) for a test that a type does not allow.
     TQueryMatcher(const TQueryCondition& condition, const TInMemClass& cls);
 
     /// Whether the condition is true for an instance of the class.
     bool Matches(const TInMemInstance& instance) const { return Evaluate(fCondition, instance) == kTrue; }
 
   private:
-    /// The order makes OR the greatest and AND the least of its parts.
+    /// In this order OR is the greatest of its parts, AND the least of its parts, and NOT x is kTrue - x.
     enum ETruth { kFalse, kUnknown, kTrue };
 
     void Bind(const TQueryCondition& condition);

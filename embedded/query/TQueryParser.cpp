@@ -1,3 +1,10 @@
+// A recursive-descent parser: each rule of the grammar in TQuery.h has an operation that reads what the rule describes and leaves
+// the next token in fToken. TakeKeyword and TakeSymbol go on to the next token only if the present one is what they look for.
+//
+// AND binds more tightly than OR and NOT more tightly than AND, because ReadOr reads its parts with ReadAnd and that with ReadNot.
+// IS NOT NULL becomes the NOT of an IS NULL. The listed properties are kept until the class is known, because they may have its
+// name in front. Depth is bounded: each level of parentheses or NOT takes stack, here and when the condition is evaluated.
+
 #include "embedded/query/TQueryParser.h"
 
 #include <utility>
@@ -124,7 +131,7 @@ TQueryParser::TListed TQueryParser::ReadListed()
     return listed;
 }
 
-/// Takes over the list, now that the class is known; a * among the names makes the list one of everything.
+/// Passes the list to the query, now that the class is known. A * among the names stands for all properties.
 void TQueryParser::TakeList()
 {
     bool isEverything = false;

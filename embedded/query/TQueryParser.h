@@ -12,19 +12,19 @@ namespace NORVZEL20 {
 /// Reads a query's text, one operation for each rule of the grammar (see TQuery).
 class TQueryParser {
   public:
-    /// How deep parentheses and NOTs may stand in each other.
+    /// How deep parentheses and NOTs may be nested.
     static constexpr unsigned int kMaxDepth = 200;
 
     /// Both must outlive the parser.
     TQueryParser(const std::string& text, TQuery& query);
 
-    /// Fills the query. Errors: TQueryError with status 16.
+    /// Fills the query. Errors: TQueryError with kInvalidQuery (16).
     void Parse();
 
   private:
     using TPointer = std::unique_ptr<TQueryCondition>;
     struct TListed {
-        std::string qualifier;  ///< the class named in front; empty for none
+        std::string qualifier;  ///< the name of the class in front; empty if there is none
         std::string name;       ///< empty for *
         std::size_t position;
     };
