@@ -1,3 +1,7 @@
+// Boost calls these operations instead of aborting the process, because host/ is compiled with BOOST_ENABLE_ASSERT_HANDLER. The
+// plug-in never tests a handle for null; it relies on the checks of boost::shared_ptr. A null handle throws here, and the
+// exception ends the call.
+
 #include <boost/assert.hpp>
 #include <string>
 

@@ -4,8 +4,8 @@
 
 namespace NORVZEL20 {
 
-/// A check of the shared-pointer library failed, such as the dereferencing of a null pointer ("px != 0"): a programming error that
-/// ends the call and not the process. what() tells expression, function, file and line; the core log has got the same at level 0.
+/// A check of the shared-pointer library failed, such as dereferencing a null pointer ("px != 0"). This is a programming error; it
+/// ends the call but not the process. what() has the expression, function, file and line. The core log gets the same at level 0.
 class TAssertionFailure : public std::logic_error {
   public:
     using std::logic_error::logic_error;

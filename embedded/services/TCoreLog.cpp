@@ -10,7 +10,7 @@ namespace {
 
 ILogger* GetStandardLogger()
 {
-    // Never destroyed: other libraries log until the very end.
+    // Never destroyed: other libraries may log until the process ends.
     static TSpdLogger* const fgLogger = new TSpdLogger;
     return fgLogger;
 }

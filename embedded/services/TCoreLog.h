@@ -4,7 +4,7 @@
 
 namespace NORVZEL20 {
 
-/// Which logger the core log is: TSpdLogger, unless somebody puts another one in its place.
+/// The logger behind the core log: a TSpdLogger, or another one that was set.
 class TCoreLog {
   public:
     TCoreLog() = delete;
@@ -12,8 +12,8 @@ class TCoreLog {
     /// Never null.
     static ILogger* Get();
 
-    /// From now on the core log is `logger`, which is not owned; null restores the one on standard error. Returns the one before.
-    /// Threads: any, but whoever removes a logger sees to it that nobody is still writing to it.
+    /// Makes `logger`, which is not owned, the core log; null restores the one on standard error. Returns the previous one.
+    /// Threads: any, at any time. Before a logger is destroyed, the caller must make sure that no thread still writes to it.
     static ILogger* Set(ILogger* logger);
 };
 

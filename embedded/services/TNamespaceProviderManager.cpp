@@ -1,3 +1,7 @@
+// The registry of namespace providers: a list in order of registration, behind a mutex. Providers register from static
+// initialisers of their libraries, in an order that nobody controls, so the registry is made on first use. It has few entries;
+// look-up goes through all of them.
+
 #include "host/TNamespaceProviderManager.h"
 
 #include <algorithm>
@@ -6,7 +10,7 @@ namespace NORVZEL20 {
 
 boost::shared_ptr<TNamespaceProviderManager> TNamespaceProviderManager::GetInstance()
 {
-    // Never destroyed: providers live in libraries whose own ends come in an order that nobody knows.
+    // Never destroyed: the libraries of the providers end in an unknown order.
     static const auto& fgInstance = *new boost::shared_ptr<TNamespaceProviderManager>(new TNamespaceProviderManager);
     return fgInstance;
 }

@@ -1,3 +1,11 @@
+// Where the host finds its data.
+//
+//  1. CIMDELTA_ROOT, if it is set and not empty.
+//  2. The place for data of the package that the library is installed in, relative to the library. A package can therefore be
+//  moved.
+//  3. In a build tree there is no such place. There the folder "root", beside that of the libraries, has a link to the data of the
+//     sources. It is used only if it has data and the place of the package has none.
+
 #include "host/TOSSpecific.h"
 
 #include <dlfcn.h>
@@ -11,10 +19,10 @@ namespace NORVZEL20 {
 
 namespace {
 
-/// The folder of the library that this is part of, links followed; empty where that cannot be told.
+/// The folder of this library, with links resolved; empty if the system does not know it.
 std::filesystem::path FindLibraryFolder()
 {
-    static const char inTheLibrary = '\0';
+    static const char inTheLibrary = '\0';  // any address in the library will do
     Dl_info info;
     std::error_code error;
     if (dladdr(&inTheLibrary, &info) == 0 || info.dli_fname == nullptr) {

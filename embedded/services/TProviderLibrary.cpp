@@ -1,3 +1,6 @@
+// Loads a library of namespace providers. The library registers its providers from its static initialisers, which run inside of
+// dlopen: the names that the registry has afterwards and did not have before are its providers.
+
 #include "embedded/services/TProviderLibrary.h"
 
 #include <dlfcn.h>
@@ -16,7 +19,7 @@ TProviderLibrary TProviderLibrary::Load(const std::string& path)
 {
     const auto manager = TNamespaceProviderManager::GetInstance();
     const std::size_t before = manager->GetProviderNames().size();
-    // An empty name would give the program itself.
+    // RTLD_NODELETE, because objects of the library may live until the process ends. An empty path would open the program itself.
     if (path.empty() || dlopen(path.c_str(), RTLD_NOW | RTLD_GLOBAL | RTLD_NODELETE) == nullptr) {
         const char* const reason = path.empty() ? "the path is empty" : dlerror();
         TCoreLog::Get()->Log(0,

@@ -25,7 +25,7 @@ spdlog::level::level_enum GetSeverity(int level)
 
 }  // namespace
 
-// Made without the registry of named loggers, which belongs to the program that this library is part of.
+// The logger is not in the registry of named loggers: the registry belongs to the program that uses this library.
 TSpdLogger::TSpdLogger()
     : fLogger(std::make_shared<spdlog::logger>("cimdelta", std::make_shared<spdlog::sinks::stderr_color_sink_mt>()))
 {

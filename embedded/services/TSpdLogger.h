@@ -10,8 +10,8 @@ class logger;
 
 namespace NORVZEL20 {
 
-/// The log on standard error: a line for each entry, with time, severity and process; one line end at an entry's end is left out.
-/// Level 0 is an error, 1 a warning, 2 information, 3 and more detail; detail is not shown. Never throws.
+/// The log on standard error: one line for each entry, with time, severity and process. One line break at the end of an entry is
+/// removed. Level 0 is an error, 1 a warning, 2 information. Entries from level 3 on are details and not shown. Never throws.
 ///
 /// Threads: any, at any time.
 class TSpdLogger : public ILogger {

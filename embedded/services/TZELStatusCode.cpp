@@ -9,7 +9,7 @@ struct TStatusText {
     std::string text;
 };
 
-// Never destroyed: an exception may still be asked for its text while the process ends.
+// Never destroyed: the text of an exception may be read while the process ends. The last entry is for every other number.
 const TStatusText* GetTexts()
 {
     static const auto* const fgTexts = new TStatusText[]{
