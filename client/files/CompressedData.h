@@ -4,10 +4,10 @@
 
 namespace NORVZEL20 {
 
-/// Ends the reading of the file `name`: its data, compressed with `kind`, is not what was compressed. Throws TClientError.
+/// Throws TClientError: the file `name`, compressed with `kind`, is damaged for that reason.
 [[noreturn]] void FailDamaged(const std::string& name, const std::string& kind, const std::string& reason);
 
-/// Ends the reading of the file `name` because there is no memory to decompress it. Throws TClientError.
+/// Throws TClientError: there is no memory to decompress the file `name`.
 [[noreturn]] void FailForMemory(const std::string& name);
 
 }  // namespace NORVZEL20

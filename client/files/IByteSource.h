@@ -4,14 +4,14 @@
 
 namespace NORVZEL20 {
 
-/// Bytes that come one piece after the other: of a file, or decompressed from another source.
+/// A stream of bytes: those of a file, or decompressed from another source.
 ///
-/// Threads: one at a time for each source.
+/// Threads: use a source from one thread at a time; different sources may be used concurrently.
 class IByteSource {
   public:
     virtual ~IByteSource() = default;
 
-    /// Fills `buffer` with at most `size` bytes and returns how many there were; 0 at the end, and only there.
+    /// Reads at most `size` bytes into `buffer` and returns how many. 0 means the end; fewer than `size` does not.
     /// Errors: TClientError that names the file and the reason; std::bad_alloc.
     virtual std::size_t Read(char* buffer, std::size_t size) = 0;
 };

@@ -1,3 +1,8 @@
+// libarchive reads archives of many formats through many filters; only the filter is wanted here. With the format "raw" the
+// decompressed data counts as an archive of one entry. "raw" refuses to be empty, so the format "empty" is accepted beside it.
+//
+// libarchive is C code and calls Fill for compressed bytes. An exception must not pass through it: Fill catches the exception and
+// reports a failure instead, and Fail rethrows the exception once libarchive has returned.
 #include "client/files/TArchiveReader.h"
 
 #include <archive.h>
@@ -15,7 +20,7 @@ namespace {
 
 const std::size_t kBlockSize = 64 * 1024;
 
-static_assert(std::is_same<la_ssize_t, long>::value, "TArchiveReader::Fill is an archive_read_callback");
+static_assert(std::is_same<la_ssize_t, long>::value, "TArchiveReader::Fill must be an archive_read_callback");
 
 bool Contains(const std::string& text, const char* part)
 {
@@ -84,12 +89,12 @@ void TArchiveReader::Fail() const
     if (fFault) {
         std::rethrow_exception(fFault);
     }
-    const char* const told = archive_error_string(fArchive.get());
-    const std::string reason = told == nullptr ? "unknown reason" : told;
+    const char* const message = archive_error_string(fArchive.get());
+    const std::string reason = message == nullptr ? "unknown reason" : message;
     if (archive_errno(fArchive.get()) == ENOMEM || Contains(reason, "not enough memory")) {
         FailForMemory(fName);
     }
-    // Each library has its own words for data that ends early, and some of them help nobody.
+    // The compression libraries describe data that ends early in several ways, not all of which a person would understand.
     const bool endsEarly = Contains(reason, "No progress is possible") || Contains(reason, "runcated");
     FailDamaged(fName, fKind, endsEarly ? "it ends early" : reason);
 }

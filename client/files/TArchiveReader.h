@@ -11,11 +11,11 @@ struct archive;
 
 namespace NORVZEL20 {
 
-/// What xz or zstd compressed, of one stream or several in a row, verified by the checksums that they hold.
+/// The decompressed bytes of an xz or zstd file, of one stream or several in a row. Checksums in the file are verified.
 class TArchiveReader : public IByteSource {
   public:
-    /// `compressed` must outlive this and begin as data of `kind` ("xz" or "zstd") does; messages call it `name`.
-    /// Errors: as of Read.
+    /// `compressed` must outlive this, and begin with the magic number of `kind`, "xz" or "zstd". Messages call it `name`.
+    /// Errors: those of Read.
     TArchiveReader(IByteSource& compressed, const std::string& name, const std::string& kind);
     TArchiveReader(const TArchiveReader&) = delete;
     TArchiveReader& operator=(const TArchiveReader&) = delete;
@@ -32,7 +32,7 @@ class TArchiveReader : public IByteSource {
     std::string fName;
     std::string fKind;
     std::vector<char> fBlock;
-    std::exception_ptr fFault;  // of fCompressed, on its way past the C library
+    std::exception_ptr fFault;  // thrown by fCompressed, kept until the C library has returned
     std::unique_ptr<archive, int (*)(archive*)> fArchive;
     bool fEmpty = false;
 };

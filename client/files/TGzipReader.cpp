@@ -1,3 +1,8 @@
+// A gzip file is a row of members: a header, deflated data, then the checksum and the length of the text. The texts of all members
+// are one text. zlib's inflate() decodes one member and verifies its end, so this reader alternates between two states: within a
+// member, where the file must not end, and between members, where it may end or go on with another member, but with nothing else.
+//
+// zlib is called directly because libarchive, which reads the other kinds, does not compare the checksums of gzip.
 #include "client/files/TGzipReader.h"
 
 #include <algorithm>
@@ -11,9 +16,9 @@ namespace {
 
 const char kKind[] = "gzip";
 const std::size_t kBlockSize = 64 * 1024;
-const int kLargestWindow = 15;
-const int kGzipAlone = 16;  // added to the window's size
-const Bytef kFirstOfMember = 0x1f;
+const int kLargestWindow = 15;      // the logarithm to base 2
+const int kGzipAlone = 16;          // added to the window: a gzip header is expected, no other
+const Bytef kFirstOfMember = 0x1f;  // of the magic number
 
 }  // namespace
 
@@ -41,7 +46,7 @@ std::size_t TGzipReader::Read(char* buffer, std::size_t size)
     return room - fStream.avail_out;
 }
 
-// Whether there is something to inflate; between members that is the begin of another one.
+// Whether there is data to inflate. Between members, prepares for the next one.
 bool TGzipReader::HasMore()
 {
     const bool filled = fStream.avail_in > 0 || Fill();
@@ -52,7 +57,7 @@ bool TGzipReader::HasMore()
         return filled;
     }
     if (*fStream.next_in != kFirstOfMember) {
-        FailDamaged(fName, kKind, "something else stands behind it");
+        FailDamaged(fName, kKind, "something else follows it");
     }
     fInMember = inflateReset(&fStream) == Z_OK;
     return true;
@@ -69,7 +74,7 @@ void TGzipReader::Inflate()
 {
     switch (inflate(&fStream, Z_NO_FLUSH)) {
     case Z_OK:
-    case Z_BUF_ERROR:  // more data is needed
+    case Z_BUF_ERROR:  // needs more data
         break;
     case Z_STREAM_END:
         fInMember = false;

@@ -9,7 +9,7 @@
 
 namespace NORVZEL20 {
 
-/// What gzip compressed, of one member or several in a row, each with its checksum and its length verified.
+/// The decompressed bytes of a gzip file, of one member or several in a row. Checksum and length of each member are verified.
 class TGzipReader : public IByteSource {
   public:
     /// `compressed` must outlive this; messages call it `name`.
@@ -29,7 +29,7 @@ class TGzipReader : public IByteSource {
     std::string fName;
     std::vector<char> fBlock;
     z_stream fStream = {};
-    bool fInMember = true;
+    bool fInMember = true;  // false between two members
 };
 
 }  // namespace NORVZEL20

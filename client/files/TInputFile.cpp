@@ -23,6 +23,7 @@ int OpenFile(const std::string& path)
         const std::error_code reason = LastSystemError();
         throw TClientError(path + ": cannot be opened", reason);
     }
+    // A directory can be opened, but not read; saying so now makes the better message.
     struct stat status;
     if (fstat(descriptor, &status) == 0 && S_ISDIR(status.st_mode)) {
         close(descriptor);
@@ -44,6 +45,7 @@ TInputFile::~TInputFile()
 
 const std::string& TInputFile::Peek(std::size_t count)
 {
+    // One read is not enough: a pipe may deliver less than asked for, and more later.
     fPeeked.resize(count);
     std::size_t length = 0;
     while (length < count) {

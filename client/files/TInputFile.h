@@ -6,10 +6,10 @@
 
 namespace NORVZEL20 {
 
-/// A file as it lies on the disk, or standard input.
+/// The bytes of a file, or of standard input, as they are.
 class TInputFile : public IByteSource {
   public:
-    /// Opens the file, or standard input for "-". Errors: TClientError where it cannot be opened or is a directory.
+    /// Opens the file, or standard input for "-". Errors: TClientError if it cannot be opened or is a directory.
     explicit TInputFile(const std::string& path);
     TInputFile(const TInputFile&) = delete;
     TInputFile& operator=(const TInputFile&) = delete;
@@ -17,8 +17,8 @@ class TInputFile : public IByteSource {
 
     std::size_t Read(char* buffer, std::size_t size) override;
 
-    /// The first bytes of the file, which Read delivers nevertheless; fewer than `count` where it has no more. To be called once,
-    /// before Read.
+    /// The first `count` bytes of the file, or all of them if there are fewer; Read returns them again. Call this at most once,
+    /// and before Read. Errors: those of Read.
     const std::string& Peek(std::size_t count);
 
     /// What messages call the file: its path, or "standard input".
@@ -30,7 +30,7 @@ class TInputFile : public IByteSource {
     std::string fName;
     int fDescriptor;
     std::string fPeeked;
-    std::size_t fDelivered = 0;  // of what was peeked
+    std::size_t fDelivered = 0;  // how many of the peeked bytes Read has returned
 };
 
 }  // namespace NORVZEL20

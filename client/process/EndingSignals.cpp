@@ -1,3 +1,9 @@
+// Cleaning up on a signal without hiding it from the parent.
+//
+// A handler that called exit() would turn "killed by SIGINT" into an ordinary exit status, and a shell script would go on with its
+// next command. So the handler cleans up, restores the signal's default action and raises the signal again. The kernel blocks a
+// signal while its handler runs: the second one becomes pending, arrives when the handler returns, and ends the process by the
+// default action. The other ending signals are blocked as well, so that no second handler interrupts the clean-up.
 #include "client/process/EndingSignals.h"
 
 namespace NORVZEL20 {
@@ -6,12 +12,12 @@ namespace {
 
 const int kEnding[] = {SIGHUP, SIGINT, SIGQUIT, SIGTERM, SIGXCPU};
 
-void (*gCleanUp)() = nullptr;  // set before the handler is installed
+// Set before the handler is installed, and never changed afterwards.
+void (*gCleanUp)() = nullptr;
 
 extern "C" void CleanUpAndEnd(int number)
 {
     gCleanUp();
-    // Held while this runs, it arrives as soon as it returns, and does what it does to a process that minds no signals.
     std::signal(number, SIG_DFL);
     raise(number);
 }

@@ -4,11 +4,13 @@
 
 namespace NORVZEL20 {
 
-/// The signals that end a process from outside and that a process can act upon: SIGHUP, SIGINT, SIGQUIT, SIGTERM, SIGXCPU.
+/// The signals with which somebody else ends a process, as far as it can handle them: SIGHUP, SIGINT, SIGQUIT, SIGTERM, SIGXCPU.
 sigset_t EndingSignals() noexcept;
 
-/// From now on such a signal calls `cleanUp` before it ends the process as it would anyway. A signal that is ignored stays ignored.
-/// `cleanUp` may only call what a signal handler may. Call this once, before there are other threads.
+/// From now on `cleanUp` is called before such a signal ends the process. To the parent the process still ends by that signal. A
+/// signal that is ignored, as nohup does with SIGHUP, stays ignored.
+/// `cleanUp` runs in a signal handler: it may only call async-signal-safe functions. Call this once, before there are other
+/// threads.
 void CleanUpOnEndingSignals(void (*cleanUp)()) noexcept;
 
 }  // namespace NORVZEL20

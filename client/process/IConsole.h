@@ -5,9 +5,9 @@
 
 namespace NORVZEL20 {
 
-/// Where a command's results and its remarks go; a test puts its own in place of the terminal.
+/// Where a command writes its result and its messages. Tests replace it.
 ///
-/// Threads: Say from any; WriteResult from one.
+/// Threads: Say and ShowProgress may be called from any thread, WriteResult from one.
 class IConsole {
   public:
     virtual ~IConsole() = default;
@@ -16,15 +16,14 @@ class IConsole {
     /// closed; TClientError if it cannot be written for another reason.
     virtual void WriteResult(const std::string& text) = 0;
 
-    /// Writes one line, without its end, to standard error, with escapes in place of what could move a terminal. Never throws, not
-    /// even where there is no memory.
+    /// Writes a line to standard error, escaped as by EscapeForDisplay; `line` comes without its end. Works without memory too:
+    /// then "?" stands for whatever would have to be escaped.
     virtual void Say(std::string_view line) noexcept = 0;
 
-    /// Whether results are to be coloured: standard output is a terminal and NO_COLOR is not set.
+    /// Whether a result on standard output is to be coloured: it is a terminal, and NO_COLOR is not set.
     virtual bool IsColored() const = 0;
 
-    /// Standard error, for a line that is overwritten: shown only where it is a terminal. An empty text wipes it away. Never
-    /// throws.
+    /// Replaces the line of progress on standard error, if that is a terminal. An empty text removes the line.
     virtual void ShowProgress(std::string_view text) noexcept = 0;
 };
 

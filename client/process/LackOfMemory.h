@@ -4,15 +4,15 @@
 
 namespace NORVZEL20 {
 
-/// What a person is told where there is no memory to tell more.
+/// The message when there is no memory for a longer one.
 extern const char* const kNoMemory;
 
-/// Throws std::bad_alloc where that is what the host's error means.
+/// Throws std::bad_alloc if the host's error is kOutOfMemory.
 void ThrowIfOutOfMemory(const TZELException& error);
 
-/// From now on, if the process would terminate because there is no memory, it calls `cleanUp`, writes kNoMemory to standard error
-/// and ends with status 2, as it does for every other lack of memory. (Some libraries need memory to give memory back.) `cleanUp`
-/// must not throw. Call this once.
+/// From now on, if std::bad_alloc leads to std::terminate, the process calls `cleanUp`, writes kNoMemory to standard error and ends
+/// with kExitTrouble (2), just as RunClient does if the exception reaches it. std::terminate for another reason still aborts.
+/// `cleanUp` must neither throw nor allocate. Call this once.
 void EndInOrderWithoutMemory(void (*cleanUp)()) noexcept;
 
 }  // namespace NORVZEL20

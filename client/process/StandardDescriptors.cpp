@@ -11,7 +11,8 @@ void ReserveStandardDescriptors() noexcept
 {
     for (const int descriptor : {STDIN_FILENO, STDOUT_FILENO, STDERR_FILENO}) {
         if (fcntl(descriptor, F_GETFD) < 0) {
-            // The lowest free descriptor is this one. The root folder is there even where no /dev is.
+            // open() returns the lowest free number, which is this one. O_PATH makes a descriptor that can be neither read nor
+            // written. Unlike /dev/null, the root folder exists everywhere.
             open("/", O_PATH);
         }
     }

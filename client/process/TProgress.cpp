@@ -15,7 +15,7 @@ TProgress::TProgress(IConsole& console, std::string doing, std::chrono::millisec
     try {
         fThread = std::thread([this] { Wait(); });
     } catch (const std::exception&) {
-        // No thread is to be had, or no memory: then nothing is told.
+        // There is no thread, or no memory for one; the work itself needs neither.
     }
 }
 
@@ -41,7 +41,7 @@ void TProgress::Wait() noexcept
         try {
             fConsole.ShowProgress(fDoing + " (" + std::to_string(elapsed) + " s)");
         } catch (const std::bad_alloc&) {
-            // There may be memory in a second.
+            // This second is skipped; in the next there may be memory again.
         }
     }
 }

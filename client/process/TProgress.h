@@ -10,10 +10,12 @@
 
 namespace NORVZEL20 {
 
-/// Tells a waiting person what is being done, once it has taken longer than a moment; wiped away when the object goes.
+/// Shows a waiting person what is being done and for how many seconds, from the first second on until this object is destroyed.
+///
+/// A thread of its own writes to the console. If none can be started, nothing is shown.
 class TProgress {
   public:
-    /// `console` must outlive this.
+    /// `console` must outlive this. `patience` is the time between two lines; only tests shorten it.
     TProgress(IConsole& console, std::string doing, std::chrono::milliseconds patience = std::chrono::milliseconds(1000));
     TProgress(const TProgress&) = delete;
     TProgress& operator=(const TProgress&) = delete;

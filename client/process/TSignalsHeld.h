@@ -4,7 +4,10 @@
 
 namespace NORVZEL20 {
 
-/// While it lives, signals that end the process wait, for this thread and those that it starts.
+/// Blocks the signals of EndingSignals() in the calling thread while this object lives; they are delivered afterwards.
+///
+/// A thread that is started meanwhile keeps them blocked for good. Helper threads are started this way, so that signals arrive in
+/// the main thread, where TUnfinishedFile can hold them back.
 class TSignalsHeld {
   public:
     TSignalsHeld() noexcept;

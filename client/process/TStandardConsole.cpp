@@ -15,8 +15,10 @@ namespace NORVZEL20 {
 
 namespace {
 
+// Moves to the begin of the line and erases to its end.
 const char kWipeLine[] = "\r\x1b[K";
 
+// A dumb terminal would show escape sequences as text.
 bool IsTerminal(int descriptor)
 {
     const char* term = std::getenv("TERM");
@@ -29,7 +31,7 @@ bool IsSet(const char* variable)
     return value != nullptr && *value != '\0';
 }
 
-// Without memory: what could move a terminal is not told.
+// Writes a line without allocating. Escaping would need memory, so ? stands for everything that is not printable ASCII.
 void SayPlainly(std::string_view line) noexcept
 {
     for (const char character : line) {
@@ -48,6 +50,7 @@ TStandardConsole::TStandardConsole()
 void TStandardConsole::WriteResult(const std::string& text)
 {
     const std::error_code error = TryWriteWhole(STDOUT_FILENO, text);
+    // If standard output was closed from the start, nobody wants the result. If it is open for reading only, that is a mistake.
     if (error == std::errc::broken_pipe || (error == std::errc::bad_file_descriptor && IsClosed(STDOUT_FILENO))) {
         throw TReaderGone();
     }

@@ -6,7 +6,7 @@
 
 namespace NORVZEL20 {
 
-/// The process's own standard output and standard error.
+/// Standard output and standard error of this process.
 class TStandardConsole : public IConsole {
   public:
     TStandardConsole();

@@ -1,3 +1,14 @@
+// Names and values come from files that anybody may have written, and are shown on a terminal. There an escape sequence can move
+// the cursor or rename the window, a line end can fake a line of the report, and a mark of direction can make a name read as
+// another one. So text is decoded as UTF-8, character by character, and whatever is not plainly visible is replaced:
+//
+//   line end, tab                                          \n \r \t
+//   other control characters below U+0080                  \x1b
+//   U+0080 to U+009F, which terminals take for escapes     \u009b
+//   marks of direction, line and paragraph separators      \u202e
+//   bytes that are not UTF-8                               \xff
+//
+// A value is also quoted if a reader could not otherwise say where it begins and ends, or which of its backslashes are its own.
 #include "client/text/DisplayText.h"
 
 #include "embedded/value/TUtf8.h"
@@ -6,6 +17,8 @@ namespace NORVZEL20 {
 
 namespace {
 
+// Control characters; the marks, embeddings, overrides and isolates of bidirectional text; the separators U+2028 and U+2029; the
+// byte order mark, which is invisible. An overlong form is judged by the character that it stands for.
 bool IsUnsafe(char32_t code)
 {
     return code < 0x20 || (code >= 0x7F && code < 0xA0) || code == 0x061C || code == 0x200E || code == 0x200F ||
@@ -37,6 +50,7 @@ void AppendEscape(std::string& out, char32_t code)
     }
 }
 
+// Whether the text needs no quotes. " -> " and " / " separate values in a report.
 bool StandsBare(std::string_view text, const std::string& escaped)
 {
     return !text.empty() && text.front() != ' ' && text.back() != ' ' && escaped == text && text != "NULL" &&

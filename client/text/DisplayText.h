@@ -7,13 +7,13 @@
 
 namespace NORVZEL20 {
 
-/// Text from an inventory as a terminal can safely show it: control characters, characters that turn the direction of writing and
-/// bytes that are no UTF-8 become escapes (\n, \t, \x1b, \u202e); everything else stays.
+/// Text from an inventory as a terminal can safely show it, in one line: control characters, characters that change the direction
+/// of writing or end a line, and bytes that are not UTF-8 become escapes (\n, \t, \x1b, \u202e). Everything else stays.
 std::string EscapeForDisplay(std::string_view text);
 
-/// A value for people, in one line. Text stands bare where that is clear; it is put in double quotes where it is empty, begins or
-/// ends with a blank, holds a control character, quote, backslash or one of the signs that a report uses itself, or could be
-/// taken for NULL.
+/// A value for people, in one line; NULL for null. Text is put in double quotes if it is empty, begins or ends with a blank, reads
+/// NULL, or holds a quote, a backslash, a character that EscapeForDisplay replaces, or " -> " or " / ", which reports use between
+/// values. Within the quotes a backslash stands before each quote and backslash. Other text is shown as it is.
 std::string DisplayValue(const TCIMValue& value);
 
 }  // namespace NORVZEL20

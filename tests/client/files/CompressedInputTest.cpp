@@ -118,7 +118,7 @@ TEST_F(CompressedInputTest, WhatStandsBehindTheDataIsRefused)
         const char* file;
         const char* told;
     } rows[] = {
-        {"web02.xml.gz", "the gzip data is damaged (something else stands behind it)"},
+        {"web02.xml.gz", "the gzip data is damaged (something else follows it)"},
         {"web02.xml.xz", "the xz data is damaged (Lzma library error: Corrupted input data)"},
         {"web02.xml.zst", "the zstd data is damaged (Zstd decompression failed: Unknown frame descriptor)"},
     };
