@@ -8,8 +8,8 @@
 
 namespace NORVZEL20 {
 
-/// Makes the inventories comparable with each other: a KALMO_OperatingSystem where there is none (the console is told), then what
-/// TSchemaCompletion does. Returns what was done. Errors: TClientError.
+/// Makes the inventories comparable with each other: first MakeMissingOperatingSystems, with a message on the console for each
+/// instance made, then TSchemaCompletion. Returns the notes of both. Errors: TClientError; the inventories may be changed by then.
 std::vector<TSchemaNote> CompleteInventories(std::vector<TInventory>& inventories, IConsole& console);
 
 }  // namespace NORVZEL20

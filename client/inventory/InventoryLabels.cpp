@@ -8,6 +8,7 @@ namespace NORVZEL20 {
 
 namespace {
 
+// Removes the suffix, unless the name is nothing else.
 bool TakeOff(std::string& name, std::string_view suffix)
 {
     if (name.size() <= suffix.size() || name.compare(name.size() - suffix.size(), suffix.size(), suffix) != 0) {
@@ -60,6 +61,7 @@ std::vector<std::string> MakeInventoryLabels(const std::vector<std::string>& pat
             labels[i] = paths[i];
         }
     }
+    // A file may itself be called "a#2", so a number is skipped if its label is taken.
     std::set<std::string> taken;
     for (std::string& label : labels) {
         const std::string plain = label;

@@ -5,11 +5,11 @@
 
 namespace NORVZEL20 {
 
-/// Short names for inventory files, in their order, no two alike.
+/// Short names for inventory files, in the order of `paths`, no two alike.
 ///
-/// A file's name without its directory and without the suffixes of its kind (.xml, .cim, .cimxml) and of its compression (.gz, .xz,
-/// .zst); "stdin" for "-". Files that would be called the same are called by their paths, and one path given several times is
-/// told apart by #2, #3 and so on.
+/// A label is the file's name without its directory and without the suffixes of its kind (.xml, .cim, .cimxml) and of its
+/// compression (.gz, .xz, .zst); "stdin" for "-". If several files would get the same label, each gets its path instead. If paths
+/// are the same, too, #2, #3 and so on follow.
 std::vector<std::string> MakeInventoryLabels(const std::vector<std::string>& paths);
 
 }  // namespace NORVZEL20

@@ -1,3 +1,12 @@
+// Why and how an operating system is made.
+//
+// The plug-in compares only namespaces that declare KALMO_OperatingSystem, and only if the reference has an instance whose OSType
+// it can read. Few inventories have one, because it is not a standard class; so the client makes what is missing:
+//   the class       as the first inventory that has it declares it; if none does, with the key Name alone
+//   OSType          is added to the class if it lacks one
+//   the instance    Name and OSType of the standard class's instance, as far as it has them with the usual types
+//   other keys      any value of their type, because a key must not be null
+// If the client also makes the rules, they exclude the class: what the client has made says nothing about the systems.
 #include "client/inventory/MakeMissingOperatingSystems.h"
 
 #include <algorithm>
@@ -20,7 +29,7 @@ const char kStandardClass[] = "CIM_OperatingSystem";
 const char kNameProperty[] = "Name";
 const char kKeyQualifier[] = "Key";
 
-// What the new instance tells about the system.
+// What the new instance says about the system.
 struct TSystem {
     TCIMValue name = TCIMValue("unknown");
     std::uint64_t type = 0;
@@ -28,12 +37,10 @@ struct TSystem {
 
 TCIMValue FindValue(const ICIMInstance& instance, const char* property)
 {
-    return FindPropertyDecl(*instance.GetClass(TCallContext()), property)
-               ? instance.GetProperty(property, TCallContext())->GetValue(TCallContext())
-               : TCIMValue();
+    return FindPropertyDecl(*instance.GetClass(TCallContext()), property) ? ValueOf(instance, property) : TCIMValue();
 }
 
-// Of several instances the one whose path comes first, so that the order in the file does not matter.
+// Of several instances the one with the smallest path, so that the order in the file has no influence.
 boost::shared_ptr<ICIMInstance> FindStandardInstance(TInMemNamespace& ns)
 {
     boost::shared_ptr<ICIMInstance> first;
@@ -53,7 +60,7 @@ boost::shared_ptr<ICIMInstance> FindStandardInstance(TInMemNamespace& ns)
     return first;
 }
 
-TSystem Describe(TInMemNamespace& ns)
+TSystem ReadStandardInstance(TInMemNamespace& ns)
 {
     TSystem system;
     const boost::shared_ptr<ICIMInstance> instance = FindStandardInstance(ns);
@@ -71,18 +78,22 @@ TSystem Describe(TInMemNamespace& ns)
     return system;
 }
 
+// The qualifier that marks keys. An inventory without declarations of qualifiers gets this one.
+boost::shared_ptr<const ICIMQualifierDecl> RequireKeyQualifier(TInMemNamespace& ns)
+{
+    if (!ns.FindQualifierDecl(kKeyQualifier)) {
+        ns.AllocateQualifierDecl(kKeyQualifier, TCIMValue(false),
+                                 ICIMQualifierDecl::EScope(ICIMQualifierDecl::kScopeProperty | ICIMQualifierDecl::kScopeReference),
+                                 ICIMQualifierDecl::kFlavorToSubclass, TCallContext());
+    }
+    return ns.FindQualifierDecl(kKeyQualifier);
+}
+
 void AddProperty(TInMemNamespace& ns, TInMemClass& cls, const char* name, TCIMValue::TCIMType type, bool isKey)
 {
     const boost::shared_ptr<ICIMPropertyDecl> decl = cls.AllocatePropertyDecl(name, TCIMValue::Null(type), TCallContext());
     if (isKey) {
-        if (!ns.FindQualifierDecl(kKeyQualifier)) {
-            ns.AllocateQualifierDecl(
-                kKeyQualifier, TCIMValue(false),
-                ICIMQualifierDecl::EScope(ICIMQualifierDecl::kScopeProperty | ICIMQualifierDecl::kScopeReference),
-                ICIMQualifierDecl::kFlavorToSubclass, TCallContext());
-        }
-        const boost::shared_ptr<const ICIMQualifierDecl> key = ns.FindQualifierDecl(kKeyQualifier);
-        decl->AddQualifier(decl->AllocateQualifier(key, TCIMValue(true), TCallContext()), TCallContext());
+        decl->AddQualifier(decl->AllocateQualifier(RequireKeyQualifier(ns), TCIMValue(true), TCallContext()), TCallContext());
     }
     cls.AddPropertyDecl(decl);
 }
@@ -93,7 +104,7 @@ void AddProperty(TInMemNamespace& ns, TInMemClass& cls, const char* name, TCIMVa
                        ", which a comparison needs, and none can be made: " + reason + "; add one to the inventory");
 }
 
-// What a declaration of the class fails on: a property that a superclass there declares with another type.
+// Why the class cannot be declared in `ns`: which property a superclass there declares with another type.
 std::string DescribeConflict(const TInMemClass& declared, const TInMemNamespace& ns)
 {
     for (const TInMemClass* cls = &declared; cls != nullptr; cls = cls->GetSuperInMemClass().get()) {
@@ -135,7 +146,7 @@ boost::shared_ptr<TInMemClass> DeclareClass(const std::vector<TInventory>& inven
     return cls;
 }
 
-// A value that a key can have, for a class whose keys are another inventory's.
+// Any value of the type, for a key of which nothing is known.
 TCIMValue SomeValue(TCIMValue::TCIMType type, const std::string& className)
 {
     switch (type) {
@@ -193,7 +204,7 @@ void AddInstance(const TInventory& inventory, TInMemClass& cls)
     if (!cls.FindPropertyDecl(kOperatingSystemType)) {
         AddTypeProperty(inventory, cls);
     }
-    const TSystem system = Describe(ns);
+    const TSystem system = ReadStandardInstance(ns);
     const boost::shared_ptr<TInMemInstance> instance = cls.AllocateInMemInstance();
     for (const std::uint32_t slot : cls.GetKeySlots()) {
         if (cls.GetSlotDecl(slot).GetType().IsArray()) {

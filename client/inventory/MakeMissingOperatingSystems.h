@@ -8,12 +8,12 @@
 
 namespace NORVZEL20 {
 
-/// Gives each inventory that lacks it an instance of KALMO_OperatingSystem, and the class where it lacks that.
+/// Makes an instance of KALMO_OperatingSystem in each inventory that has none, and declares the class if necessary.
 ///
-/// Class and instance are made after those of another inventory where there is one, else with the key Name and OSType alone. OSType
-/// and Name are those of the inventory's instance of (a class below) CIM_OperatingSystem, else 0 and "unknown".
-/// Returns a note for each instance made. Errors: TClientError where the class cannot be declared in an inventory
-/// as in another one, or has keys that no value can be made for.
+/// The class is declared as in the first inventory that declares it, or else with the key Name and OSType alone. Name and OSType of
+/// the instance are those of the inventory's CIM_OperatingSystem, or of a class below that, or else "unknown" and 0.
+/// Returns a note for each instance made. Errors: TClientError if the class cannot be declared as in the other inventory, or if one
+/// of its keys is an array; inventories may be changed by then.
 std::vector<TSchemaNote> MakeMissingOperatingSystems(std::vector<TInventory>& inventories);
 
 }  // namespace NORVZEL20

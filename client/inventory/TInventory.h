@@ -10,7 +10,7 @@ namespace NORVZEL20 {
 
 /// One loaded inventory.
 struct TInventory {
-    std::string path;   ///< as the person gave it; "-" is standard input
+    std::string path;   ///< as given on the command line; "-" is standard input
     std::string label;  ///< what reports call it; see MakeInventoryLabels
     boost::shared_ptr<TInMemNamespace> ns;
     TLoadReport loaded;

@@ -1,3 +1,12 @@
+// The first bytes of an inventory file say what it is; its name does not matter, and standard input has none.
+//
+//   1f 8b                               gzip
+//   fd 37 7a 58 5a 00                   xz
+//   28 b5 2f fd                         zstd
+//   BZh, 04 22 4d 18, PK 03 04, LZIP    bzip2, lz4, zip, lzip: refused, and named in the message
+//   anything else                       plain; the XML parser judges it
+//
+// No XML document begins with any of these bytes, in any encoding that is read.
 #include "client/inventory/TInventoryFile.h"
 
 #include <vector>
@@ -13,7 +22,7 @@ namespace {
 const std::string kGzip = "\x1f\x8b";
 const std::string kXz("\xfd\x37zXZ\x00", 6);
 const std::string kZstd = "\x28\xb5\x2f\xfd";
-const std::size_t kLongest = 6;
+const std::size_t kLongest = 6;  // of the magic numbers
 
 const struct {
     const char* begin;

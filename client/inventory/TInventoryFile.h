@@ -8,20 +8,20 @@
 
 namespace NORVZEL20 {
 
-/// The text of an inventory file: plain, or decompressed from gzip, xz or zstd, which its first bytes tell.
+/// The text of an inventory file: plain, or decompressed from gzip, xz or zstd, by its first bytes and whatever its name.
 ///
-/// Threads: distinct files at once.
+/// Threads: as IByteSource.
 class TInventoryFile : public IByteSource {
   public:
-    /// Opens the file, or standard input for "-". Errors: TClientError where it cannot be opened, is a directory or is compressed
-    /// otherwise; as of Read.
+    /// Opens the file, or standard input for "-". Errors: TClientError if it cannot be opened, is a directory or is compressed in
+    /// another way; those of Read.
     explicit TInventoryFile(const std::string& path);
 
-    /// Errors: also TClientError where the compressed data is damaged, ends early or has something else behind it.
+    /// Errors: also TClientError if the compressed data is damaged, ends early or is followed by something else.
     std::size_t Read(char* buffer, std::size_t size) override;
 
-    /// To be called where the text makes no sense: reads on, so that damage of compressed data is told rather than what came of it.
-    /// Errors: as of Read. Cost: at most 1 GiB is decompressed.
+    /// Reads on to the end of compressed data. Call this if the text is not an inventory: if the data is damaged, the checksum at
+    /// its end shows it, and the damage is the better message. Errors: those of Read. Cost: decompresses at most 1 GiB.
     void CheckRest();
 
     /// What messages call the file: its path, or "standard input".
@@ -29,7 +29,7 @@ class TInventoryFile : public IByteSource {
 
   private:
     TInputFile fFile;
-    std::unique_ptr<IByteSource> fText;  // null where the file is plain
+    std::unique_ptr<IByteSource> fText;  // decompresses fFile; null if the file is plain
 };
 
 }  // namespace NORVZEL20

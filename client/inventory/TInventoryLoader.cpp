@@ -1,3 +1,12 @@
+// Inventories are loaded concurrently, yet the outcome does not depend on timing.
+//
+// Thread i begins with inventory i, thread 0 being the calling one. A thread that is done with an inventory takes the next one that
+// no thread has taken (fNext, the only state that threads share), until none is left; so a large inventory keeps only its own
+// thread busy. If the system starts fewer threads than wanted, the calling thread also loads what the others would have begun with.
+//
+// Each inventory has its own namespace and its own place for an exception, which only the thread that loads it uses. All
+// inventories are tried. When all threads have ended, the first exception in the order of the command line is thrown: the message
+// is the same whichever file failed first.
 #include "client/inventory/TInventoryLoader.h"
 
 #include <algorithm>
@@ -29,6 +38,7 @@ void LoadInto(TInventory& inventory)
         inventory.loaded =
             populator.LoadFromSource([&file](char* buffer, std::size_t size) { return file.Read(buffer, size); }, file.GetName());
     } catch (const TPopulateError& error) {
+        // The text may be malformed only because the compressed file is damaged.
         file.CheckRest();
         throw TClientError(error.what());
     } catch (const TZELException& error) {
@@ -46,15 +56,14 @@ TInventory Prepare(const std::string& path, const std::string& label)
     return inventory;
 }
 
-// Loads inventories on this thread and some helpers. Each thread has a first inventory of its own, then takes the next one that is
-// left. A helper that is not to be had is done without.
+// Loads inventories on the calling thread and on helper threads.
 class TParallelLoad {
   public:
     explicit TParallelLoad(std::vector<TInventory>& inventories)
         : fInventories(inventories), fFaults(inventories.size()), fNext(CountAtOnce(inventories.size()))
     {}
 
-    // Errors: that of the first inventory that cannot be loaded; all have been tried by then.
+    // Errors: that of the first inventory that cannot be loaded.
     void Run()
     {
         const std::size_t atOnce = fNext;
@@ -62,6 +71,7 @@ class TParallelLoad {
         helpers.reserve(atOnce);
         StartHelpers(helpers, atOnce);
         Work(0);
+        // What the helpers that could not be started would have begun with.
         for (std::size_t i = helpers.size() + 1; i < atOnce; ++i) {
             TryLoad(i);
         }
@@ -90,7 +100,7 @@ class TParallelLoad {
                 helpers.emplace_back(&TParallelLoad::Work, this, helpers.size() + 1);
             }
         } catch (const std::exception&) {
-            // No thread is to be had, or no memory for one: the others do its work.
+            // There is no thread, or no memory for one: the threads that there are do the work.
         }
     }
 
@@ -111,8 +121,8 @@ class TParallelLoad {
     }
 
     std::vector<TInventory>& fInventories;
-    std::vector<std::exception_ptr> fFaults;
-    std::atomic<std::size_t> fNext;
+    std::vector<std::exception_ptr> fFaults;  // one for each inventory; null if it was loaded
+    std::atomic<std::size_t> fNext;           // the first inventory that no thread has taken
 };
 
 }  // namespace
@@ -132,7 +142,7 @@ std::vector<TInventory> TInventoryLoader::Load(const std::vector<std::string>& p
         TParallelLoad(inventories).Run();
     }
     for (const TInventory& inventory : inventories) {
-        TellTolerated(inventory);
+        ReportTolerated(inventory);
     }
     return inventories;
 }
@@ -142,7 +152,7 @@ TInventory TInventoryLoader::LoadOne(const std::string& path)
     return Load({path}).front();
 }
 
-void TInventoryLoader::TellTolerated(const TInventory& inventory)
+void TInventoryLoader::ReportTolerated(const TInventory& inventory)
 {
     for (const TLoadReport::TTolerated& tolerated : inventory.loaded.tolerated) {
         const std::string times = tolerated.count > 1 ? " (" + std::to_string(tolerated.count) + " times)" : "";

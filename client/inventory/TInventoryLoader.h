@@ -8,21 +8,23 @@
 
 namespace NORVZEL20 {
 
-/// Loads inventories, each into a namespace of its own: at the same time as many as the hardware has threads, at least 2, at
-/// most 16.
+/// Loads inventories, each into a namespace of its own: as many concurrently as the hardware has threads, at least 2 and at most
+/// 16, so that few files are open at a time.
 class TInventoryLoader {
   public:
-    /// `console` must outlive this; it is told what was tolerated in the files.
+    /// `console` must outlive this. It shows the progress, and a message for each fault that was tolerated in a file.
     explicit TInventoryLoader(IConsole& console) : fConsole(console) {}
 
-    /// The inventories in the order of `paths`. Where several cannot be loaded, the error is that of the first of them.
-    /// Errors: TClientError; its text names file, line and column where they are known.
+    /// The inventories in the order of `paths`, of which one may be "-" for standard input.
+    /// Errors: TClientError that names file, line and column, as far as they are known. If several inventories cannot be loaded,
+    /// the error is that of the first of them in the order of `paths`.
     std::vector<TInventory> Load(const std::vector<std::string>& paths);
 
+    /// The same for a single inventory.
     TInventory LoadOne(const std::string& path);
 
   private:
-    void TellTolerated(const TInventory& inventory);
+    void ReportTolerated(const TInventory& inventory);
 
     IConsole& fConsole;
 };

@@ -1,3 +1,15 @@
+// How the schemas become one.
+//
+// Every inventory in turn is the source. Its classes are taken in the order of their declaration, superclasses first, to each other
+// inventory, the target:
+//   the target lacks the class              it is declared there, with the superclasses that are missing too
+//   the target lacks a property             it is declared there
+//   the target spells a name otherwise      it gets the source's spelling, if the source comes first
+//   a type or the keys differ               that is noted, once for each pair of inventories
+// What an early source declares in a later one is there when that one is the source; so one pass over all makes the union.
+//
+// Stored references name classes and keys, hence those of changed inventories are rewritten at the end. Notes are sorted, because
+// they arise in the order of declaration, which depends on the tool that wrote the file.
 #include "client/inventory/TSchemaCompletion.h"
 
 #include <algorithm>
@@ -26,7 +38,7 @@ std::vector<std::string> KeysInLowerCase(const TInMemClass& cls)
     return keys;
 }
 
-/// Why a property cannot be declared in `cls`: what declares it otherwise.
+// Why a property cannot be declared in `cls`: which class below declares it with another type.
 std::string DescribeConflict(const TInMemClass& cls, const TInMemPropertyDecl& property)
 {
     for (const boost::shared_ptr<TInMemClass>& below : cls.GetClassesBelow()) {
@@ -45,7 +57,7 @@ std::vector<TSchemaNote> TSchemaCompletion::Run()
 {
     fNotes.clear();
     for (std::size_t source = 0; source < fInventories.size(); ++source) {
-        // Nothing is declared in the source itself meanwhile, but the list is copied: targets may be the same namespace.
+        // A copy of the list: if one namespace is passed twice, declaring in the target changes the source's list as well.
         const std::vector<boost::shared_ptr<TInMemClass>> classes = fInventories[source].ns->GetClasses();
         for (const boost::shared_ptr<TInMemClass>& cls : classes) {
             for (std::size_t target = 0; target < fInventories.size(); ++target) {
@@ -77,6 +89,7 @@ void TSchemaCompletion::Spread(std::size_t source, const TInMemClass& cls, std::
         Declare(source, cls, target);
         return;
     }
+    // The first inventory decides the spelling; and what differs is noted once, not a second time in the other direction.
     if (target > source) {
         Respell(source, cls, target);
         if (KeysInLowerCase(cls) != KeysInLowerCase(*there)) {
@@ -148,7 +161,7 @@ void TSchemaCompletion::Note(TSchemaNote::EKind kind, std::size_t target, std::s
     fNotes.push_back({kind, target, source, className, property, before});
 }
 
-/// Stored references name classes and keys; where declarations changed, those are written anew.
+// Rewrites the stored references of the inventories whose declarations have changed.
 void TSchemaCompletion::AdaptReferences()
 {
     std::set<std::size_t> changed;

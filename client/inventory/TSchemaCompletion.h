@@ -8,20 +8,21 @@
 
 namespace NORVZEL20 {
 
-/// Declares in each inventory what the others declare, so that inventories of different schemas can be compared.
+/// Declares in each inventory what the others declare, so that inventories with different schemas can be compared.
 ///
-/// Inventory by inventory and class by class, superclasses first: a class or property that another one lacks is declared there; a
-/// name in another letter case gets the spelling of the first inventory that has it, in references too. Instances are neither made
-/// nor removed; a property declared late is null. Keys and types that differ cannot be reconciled and are only noted.
+/// A class or property that an inventory lacks is declared there. A name that differs in letter case gets the spelling of the first
+/// inventory that has it, in stored references too. Instances are neither made nor removed; a property that is declared late is
+/// null in all of them. Keys and types that differ cannot be reconciled and are only noted.
 class TSchemaCompletion {
   public:
     /// `inventories` must outlive this.
     explicit TSchemaCompletion(std::vector<TInventory>& inventories) : fInventories(inventories) {}
 
-    /// What was done and found, by the inventory whose declarations were taken, then by class; the order in the files does not
-    /// show. Errors: TClientError where a class or property cannot be declared in an inventory because one above or below it there
-    /// has a property of another type, or because it would go beyond TSchemaLimits, or where two instances are the same once their
-    /// keys are spelled alike.
+    /// Returns what was done and found, ordered by the inventory whose declarations were taken, then by class; the order of classes
+    /// in the files has no influence.
+    /// Errors: TClientError if a class or property cannot be declared because a class above or below it has the property with
+    /// another type, if the schema would exceed TSchemaLimits, or if two instances have the same path once their references are
+    /// spelled alike. The inventories may be changed by then.
     std::vector<TSchemaNote> Run();
 
   private:
