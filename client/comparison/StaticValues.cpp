@@ -4,6 +4,7 @@ namespace NORVZEL20 {
 
 namespace {
 
+// Whether the property, which is static in `cls`, has another value in the other inventory or is not static there.
 bool DiffersIn(const TInMemNamespace& other, const TInMemClass& cls, TInMemPropertyDecl& decl)
 {
     const boost::shared_ptr<TInMemClass> counterpart = other.FindClass(cls.GetName());

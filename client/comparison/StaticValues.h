@@ -6,9 +6,10 @@
 
 namespace NORVZEL20 {
 
-/// Whether a static property of the first inventory has another value in one of the others, or is none there.
+/// Whether a static property of the first inventory has another value in one of the others, or is not static there.
 ///
-/// Such a value is one for all instances of a class: a run that gives it to the first instance that differs has given it to all.
+/// All instances of a class share the value of a static property. A run that brings the first inventory in line with another one
+/// would therefore change all of them with the first instance that differs.
 bool StaticValuesDiffer(const std::vector<TInventory>& inventories);
 
 }  // namespace NORVZEL20

@@ -1,3 +1,11 @@
+// A comparison in steps:
+//
+// (1) Complete the inventories, so that each declares what the others declare; with --strict-schema, leave them as they are.
+// (2) Read the rules. If the person named no file, make rules that include every class, in a temporary file: the plug-in reads
+//     rules from files only.
+// (3) Find out what will be compared. This must be done before the run, which may add instances to the reference.
+// (4) Let the plug-in compare. Its log is captured, because it says more about a failure than the exception does.
+// (5) Read the plug-in's records back as differences with values.
 #include "client/comparison/TComparison.h"
 
 #include <algorithm>
@@ -26,7 +34,8 @@ namespace {
 
 boost::shared_ptr<TDeltaNamespace> MakeDeltaNamespace()
 {
-    // Linked with the plug-in, the client need not load it; asking for its provider keeps the linker from leaving it out.
+    // The client is linked with the plug-in and need not load it. The call keeps the linker from dropping the library, which
+    // registers its provider when it is loaded.
     TDeltaNamespaceProvider::GetInstance();
     const boost::shared_ptr<INamespaceProvider> provider =
         TNamespaceProviderManager::GetInstance()->FindProvider(kDeltaProviderName);
@@ -44,8 +53,8 @@ boost::shared_ptr<TDeltaNamespace> MakeDeltaNamespace()
     }
 }
 
-// A class that excludes keys makes the delta namespace hold itself through its class wrappers, by design of the plug-in. It lives
-// until the process ends, and this keeps it in sight: the list is never destroyed either.
+// If a class excludes keys, the plug-in makes a class wrapper that owns its delta namespace, which owns the wrapper in turn: both
+// live until the process ends. The list, which is never destroyed, keeps them reachable, so that no leak is reported.
 void KeepForever(const boost::shared_ptr<TDeltaNamespace>& records)
 {
     static auto* const fgKept = new std::vector<boost::shared_ptr<TDeltaNamespace>>;
@@ -92,8 +101,9 @@ void TComparison::FindDifferences(TDeltaNamespace& records, TRules& rules)
     for (const TInventory& inventory : fInventories) {
         records.AddNamespaceToCompareList(inventory.ns);
     }
-    const bool twice = MustBeLeftAsItIs();
-    if (twice) {
+    // See MustKeepReference: the only other inventory is added twice.
+    const bool addTwice = MustKeepReference();
+    if (addTwice) {
         records.AddNamespaceToCompareList(fInventories.back().ns);
     }
     const TLogCapture log;
@@ -106,14 +116,17 @@ void TComparison::FindDifferences(TDeltaNamespace& records, TRules& rules)
     } catch (const TAssertionFailure& error) {
         throw TClientError(std::string("the comparison failed: ") + error.what());
     }
-    if (twice) {
+    if (addTwice) {
         RemovePosition(records, fInventories.size());
     }
 }
 
-// A pair's reference takes over the other one's values on the way. Where keys or types differ it cannot, and a static value it
-// takes over for all instances at once; the other one then counts twice, since three inventories are left as they are.
-bool TComparison::MustBeLeftAsItIs() const
+// Whether the run must not change the reference.
+//
+// With exactly two namespaces the plug-in brings the reference in line with the other one, instance by instance. That fails if keys
+// or types differ, and changes instances that are yet to be compared if a static value differs. Three namespaces are only read. So
+// if the other one is added twice, the reference stays as it is, and every record names two positions, of which one is removed.
+bool TComparison::MustKeepReference() const
 {
     if (fInventories.size() != 2) {
         return false;

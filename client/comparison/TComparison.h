@@ -10,21 +10,22 @@
 
 namespace NORVZEL20 {
 
-/// One comparison of loaded inventories by the plug-in, from the schemas' completion to the report.
+/// One comparison of loaded inventories by the plug-in.
 class TComparison {
   public:
-    /// Everything must outlive this. The inventories are changed: by completion, and a pair's reference by the run itself.
+    /// `inventories`, the reference first and at least two, and `console` must outlive this. The inventories are changed: all by
+    /// CompleteInventories, and the reference by a run with exactly one other inventory, which brings it in line with that one.
     TComparison(std::vector<TInventory>& inventories, IConsole& console) : fInventories(inventories), fConsole(console) {}
 
-    /// Compares everything as it is declared, or, with `rulesFile` not empty, as those rules say. With `strictSchema` the
-    /// inventories are taken as they are, else they are completed first.
-    /// Errors: TClientError; nothing is reported then.
+    /// Compares under the rules of `rulesFile`, or, if that is empty, every class in every property. With `strictSchema` the
+    /// inventories are not completed first. Call this once.
+    /// Errors: TClientError; std::bad_alloc.
     TComparisonReport Run(const std::string& rulesFile, bool strictSchema);
 
   private:
     TComparisonReport RunWith(const std::string& rulesFile, const std::string& shownName);
     void FindDifferences(TDeltaNamespace& records, TRules& rules);
-    bool MustBeLeftAsItIs() const;
+    bool MustKeepReference() const;
 
     std::vector<TInventory>& fInventories;
     IConsole& fConsole;

@@ -1,3 +1,10 @@
+// The plug-in ends a run with a status and a few words that name neither file nor class. The status narrows down what can be wrong
+// with the inventories, so this looks for the first thing of that kind, in the order in which the plug-in walks the classes:
+//
+//   kInitializationFailed (3)    an operating system that is missing or has no usable OSType
+//   kTypeMismatch (13)           a property that has another type in another inventory
+//   kNotFound (15)               a property that another inventory does not declare
+//   kSchemaMismatch (37)         a class that another inventory does not declare
 #include "client/comparison/TComparisonFault.h"
 
 #include "client/inventory/CollectObjects.h"
@@ -15,7 +22,7 @@ std::string Name(const ICIMClass& cls)
     return cls.GetName(TCallContext());
 }
 
-// Whether the first instance has what the plug-in reads of it.
+// Whether the plug-in can read the OSType of the first instance: it must convert to uint16.
 bool HasUsableType(TInMemClass& systems)
 {
     try {
@@ -27,7 +34,7 @@ bool HasUsableType(TInMemClass& systems)
     }
 }
 
-// The reason of status 3: the first inventory that does not hold what the plug-in asks every inventory for.
+// The cause of kInitializationFailed (3): the first inventory that lacks what the plug-in requires of it.
 std::string FindSystemTrouble(const std::vector<TInventory>& inventories)
 {
     for (const TInventory& inventory : inventories) {
@@ -46,7 +53,7 @@ std::string FindSystemTrouble(const std::vector<TInventory>& inventories)
            " between 0 and 65535";
 }
 
-// The reason of status 37.
+// The cause of kSchemaMismatch (37).
 std::string FindUndeclaredClass(const TInventory& reference, const TInventory& other, TInMemClass& cls,
                                 const std::vector<std::string>&)
 {
@@ -55,7 +62,7 @@ std::string FindUndeclaredClass(const TInventory& reference, const TInventory& o
                : std::string();
 }
 
-// The reason of status 15.
+// The cause of kNotFound (15).
 std::string FindUndeclaredProperty(const TInventory&, const TInventory& other, TInMemClass& cls,
                                    const std::vector<std::string>& properties)
 {
@@ -68,7 +75,7 @@ std::string FindUndeclaredProperty(const TInventory&, const TInventory& other, T
     return std::string();
 }
 
-// The reason of status 13.
+// The cause of kTypeMismatch (13).
 std::string FindOtherType(const TInventory& reference, const TInventory& other, TInMemClass& cls, const std::vector<std::string>&)
 {
     const boost::shared_ptr<TInMemClass> there = other.ns->FindClass(cls.GetName());
@@ -84,7 +91,7 @@ std::string FindOtherType(const TInventory& reference, const TInventory& other, 
     return std::string();
 }
 
-// The first trouble in the order of the reference's classes that are compared.
+// The first text that `find` gives for a class that is compared; empty if it gives none.
 template <class TFind>
 std::string FindFirst(const std::vector<TInventory>& inventories, TRules& rules, TFind find)
 {

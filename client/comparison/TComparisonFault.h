@@ -9,13 +9,14 @@
 
 namespace NORVZEL20 {
 
-/// Why a run of the plug-in failed, for a person: the plug-in's own words, then what about the inventories brings it about.
+/// Why a run of the plug-in failed: the plug-in's own words, then what in the inventories is the cause.
 struct TComparisonFault {
     TZELStatusCode status;
-    std::string reason;            ///< the exception's text
+    std::string reason;            ///< the exception's text, used if the log is empty
     std::vector<std::string> log;  ///< what the plug-in logged, without line ends
-    bool strictSchema;
+    bool strictSchema;             ///< whether --strict-schema was given; without it, completion prevents most failures
 
+    /// The message for the person. `inventories` are those of the run, in its order. Cost: a walk over the reference's classes.
     std::string Describe(const std::vector<TInventory>& inventories, TRules& rules) const;
 };
 

@@ -16,6 +16,7 @@ TComparisonReport::TCounts TComparisonReport::Count() const
             break;
         case TDifference::kChanged:
             ++counts.changedValues;
+            // Differences of one instance follow each other.
             if (previous == nullptr || previous->kind != TDifference::kChanged || previous->instance != difference.instance) {
                 ++counts.changedInstances;
             }

@@ -10,24 +10,25 @@
 
 namespace NORVZEL20 {
 
-/// The result of a comparison, ready to be shown. Its order depends on the inventories' contents alone.
+/// The result of a comparison, ready to be shown. The order of everything in it depends on the inventories' contents alone.
 struct TComparisonReport {
     /// How many differences of each kind there are.
     struct TCounts {
         std::size_t onlyInReference = 0;
         std::size_t onlyInOthers = 0;
         std::size_t changedValues = 0;
-        std::size_t changedInstances = 0;
+        std::size_t changedInstances = 0;  ///< the instances that the changed values belong to
 
         std::size_t GetTotal() const { return onlyInReference + onlyInOthers + changedValues; }
     };
 
-    std::vector<std::string> labels;  ///< of the inventories; the first one is the reference
-    std::vector<std::string> paths;
+    std::vector<std::string> labels;       ///< of the inventories; the first one is the reference
+    std::vector<std::string> paths;        ///< of the inventories, in the same order
     std::vector<TDifference> differences;  ///< by class name, then instance, then property
     TCoverage coverage;
     boost::shared_ptr<TDeltaNamespace> records;  ///< the delta namespace of the run
 
+    /// Counts the differences. Cost: one pass over them.
     TCounts Count() const;
 };
 

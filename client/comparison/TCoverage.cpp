@@ -26,7 +26,7 @@ bool TCoverage::IsComplete(bool timesCount) const
 bool TCoverage::IsWholeClass(const TClass& cls, bool timesCount) const
 {
     if (cls.state == kOperatingSystemMade) {
-        // Nothing of an inventory is left out where none had an instance.
+        // If every instance was made, none that came from an inventory is left out.
         const auto made = std::count_if(notes.begin(), notes.end(),
                                         [](const TSchemaNote& note) { return note.kind == TSchemaNote::kOperatingSystemMade; });
         return static_cast<std::size_t>(made) == cls.instances.size();

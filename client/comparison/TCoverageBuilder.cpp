@@ -1,3 +1,11 @@
+// Which classes a comparison covers. The plug-in walks the class tree of the reference, so a class that has instances anywhere is
+//
+//   unknown to the reference    if that does not declare it;
+//   excluded                    if the rules leave it no property (kOperatingSystemMade if the client excluded it by itself);
+//   compared                    otherwise.
+//
+// Of a compared class two things may still escape the comparison, and are listed: properties that the rules or the reference's
+// declaration leave out, and, if the rules exclude keys, instances that share their key with an earlier one.
 #include "client/comparison/TCoverageBuilder.h"
 
 #include <algorithm>
@@ -10,7 +18,7 @@ namespace NORVZEL20 {
 
 TCoverage TCoverageBuilder::Build()
 {
-    // The first inventory that declares a class names it; the others may spell it otherwise.
+    // The set ignores letter case, so a class has the spelling of the first inventory that declares it.
     std::set<std::string, TNameText::TLess> names;
     for (const TInventory& inventory : fInventories) {
         for (const boost::shared_ptr<TInMemClass>& cls : inventory.ns->GetClasses()) {
@@ -62,7 +70,7 @@ void TCoverageBuilder::Describe(TCoverage::TClass& cls, const boost::shared_ptr<
     }
 }
 
-// Of all inventories: without a completed schema the others may declare properties that the reference does not.
+// The properties of all inventories count: with --strict-schema, others may declare some that the reference does not.
 std::vector<std::string> TCoverageBuilder::LeftOut(const std::string& className, const std::vector<std::string>& compared) const
 {
     const std::set<std::string, TNameText::TLess> taken(compared.begin(), compared.end());

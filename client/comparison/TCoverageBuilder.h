@@ -10,14 +10,15 @@
 
 namespace NORVZEL20 {
 
-/// Finds out, before a comparison, what it will look at. (A comparison of two inventories adds instances to the first one.)
+/// Finds out what a comparison will look at. To be used before the run: with two inventories that adds instances to the first one.
 class TCoverageBuilder {
   public:
-    /// Everything must outlive this.
+    /// The arguments must outlive this. The inventories are those of the run, in its order.
     TCoverageBuilder(const std::vector<TInventory>& inventories, TRules& rules, const std::vector<TSchemaNote>& notes)
         : fInventories(inventories), fRules(rules), fNotes(notes)
     {}
 
+    /// Errors: TZELException of a namespace; std::bad_alloc. Cost: with excluded keys, one key for each instance of the class.
     TCoverage Build();
 
   private:

@@ -25,14 +25,14 @@ struct TDifference {
 
     EKind kind;
     std::string className;
-    std::string instance;                                 ///< the key under which instances were matched, as path text
+    std::string instance;                                 ///< the key by which instances were matched, as path text
     std::vector<std::pair<std::string, TCIMValue>> keys;  ///< the same, key by key, in the class's order
-    std::string property;                                 ///< of kChanged only
-    std::vector<std::size_t> inventories;                 ///< positions, ascending, each once
-    TCIMValue reference;                                  ///< of kChanged: what the reference held before the comparison
-    std::vector<TGroup> others;                           ///< of kChanged: what the others hold, equal values together
+    std::string property;                                 ///< only of kChanged
+    std::vector<std::size_t> inventories;                 ///< the positions of those that differ, ascending, each once
+    TCIMValue reference;                                  ///< only of kChanged: the reference's value before the run
+    std::vector<TGroup> others;                           ///< only of kChanged: the values of `inventories`, equal ones together
 
-    /// The instance's key without the class: `Key1="v",Key2=5`; empty where no key counts.
+    /// The instance's key without the class: `Key1="v",Key2=5`; empty if the rules exclude every key.
     std::string GetKeyText() const
     {
         return instance.size() > className.size() ? instance.substr(className.size() + 1) : std::string();

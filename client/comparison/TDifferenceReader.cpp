@@ -1,3 +1,14 @@
+// From records to differences.
+//
+// A record names a class, an instance, a property and the positions of inventories, but no value. The values are looked up:
+//   instance removed    the keys of the reference's instance
+//   instance added      the keys of the instance in the first inventory that has it
+//   property changed    the reference's value, and the value of each inventory concerned; inventories with equal values are grouped
+//
+// After a run with two inventories the reference holds the other one's values. The embedded host keeps what a property held before
+// its first change; a report shows this earlier value.
+//
+// Records come class by class. An index from key to instances is made for one class and inventory when it is first needed.
 #include "client/comparison/TDifferenceReader.h"
 
 #include <algorithm>
@@ -12,7 +23,7 @@ namespace NORVZEL20 {
 
 namespace {
 
-// A comparison of two inventories has given the reference the other one's values; it remembers what it held.
+// The value before the run. An instance that is not of the embedded host has no earlier value.
 TCIMValue ValueBefore(const ICIMInstance& instance, const std::string& property)
 {
     const boost::shared_ptr<ICIMProperty> handle = instance.GetProperty(property, TCallContext());
@@ -21,7 +32,7 @@ TCIMValue ValueBefore(const ICIMInstance& instance, const std::string& property)
     return earlier == nullptr ? handle->GetValue(TCallContext()) : *earlier;
 }
 
-// What looks alike to a person, too: instants that are equal may be written with other offsets.
+// Equal and written alike: datetimes with different offsets from UTC can be equal, but a report shows their texts.
 bool LookEqual(const TCIMValue& a, const TCIMValue& b)
 {
     return a == b && a.ToText() == b.ToText();
@@ -31,6 +42,7 @@ void AddToGroups(std::vector<TDifference::TGroup>& groups, std::size_t inventory
 {
     for (TDifference::TGroup& group : groups) {
         if (LookEqual(group.value, value)) {
+            // Instances that share a key may bring the same value twice.
             if (group.inventories.back() != inventory) {
                 group.inventories.push_back(inventory);
             }
@@ -104,7 +116,7 @@ TDifference TDifferenceReader::Make(const TDeltaRecord& record)
     return difference;
 }
 
-// With excluded keys the record names an instance that is missing elsewhere by its own path, else by its key.
+// The reference's instance that a record of a removed instance names: by its key, or by its own path if the class excludes keys.
 boost::shared_ptr<ICIMInstance> TDifferenceReader::FindByPath(const std::string& path)
 {
     if (fRules.ExcludedKeysOf(fClassName).empty()) {
@@ -144,7 +156,7 @@ void TDifferenceReader::AddValues(TDifference& difference)
     }
 }
 
-// One value, save where excluded keys make several instances share the key: then all that are not the reference's.
+// The inventory's value. If keys are excluded, several instances may share the key: then all values that are not the reference's.
 std::vector<TCIMValue> TDifferenceReader::OtherValues(const TDifference& difference, std::size_t inventory)
 {
     std::vector<TCIMValue> values;

@@ -12,13 +12,15 @@
 
 namespace NORVZEL20 {
 
-/// Turns the records of a run into differences with their values, which the records do not hold.
+/// Turns the records of a run into differences with values, which the records do not hold.
 class TDifferenceReader {
   public:
-    /// Everything must outlive this. The inventories are those of the run, in its order.
+    /// The arguments must outlive this. The inventories are those of the run, in its order.
     TDifferenceReader(const std::vector<TInventory>& inventories, TRules& rules) : fInventories(inventories), fRules(rules) {}
 
-    /// The differences of all records, by class name, then instance, then property.
+    /// The differences of all records, ordered by class name, then instance, then property.
+    /// Errors: TZELException of a namespace; std::out_of_range if the records are not those of a run with these inventories.
+    /// Cost: one key for each instance of a class with differences.
     std::vector<TDifference> Read(TDeltaNamespace& records);
 
   private:
@@ -33,9 +35,9 @@ class TDifferenceReader {
     const std::vector<TInventory>& fInventories;
     TRules& fRules;
     std::string fClassName;
-    std::vector<std::string> fKeyNames;                                        // those that count, of the class being read
+    std::vector<std::string> fKeyNames;                                        // the keys not excluded, of the class being read
     std::vector<std::unique_ptr<TInstanceIndex>> fIndexes;                     // of the class being read, made when first needed
-    std::unordered_map<std::string, boost::shared_ptr<ICIMInstance>> fByPath;  // the reference's instances of that class
+    std::unordered_map<std::string, boost::shared_ptr<ICIMInstance>> fByPath;  // the reference's instances, likewise
 };
 
 }  // namespace NORVZEL20

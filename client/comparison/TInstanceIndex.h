@@ -11,18 +11,19 @@
 
 namespace NORVZEL20 {
 
-/// The instances of one class of one namespace under the keys that the rules give them.
+/// The instances of one class of one namespace by their keys, as the rules define them.
 class TInstanceIndex {
   public:
     using TInstances = std::vector<boost::shared_ptr<ICIMInstance>>;
 
-    /// Cost: one key for each instance.
+    /// Empty if the namespace does not declare the class. Errors: TZELException of the namespace. Cost: one key for each instance.
     TInstanceIndex(ICIMNamespace& ns, const std::string& className, TRules& rules);
 
-    /// The instances with that key in order of insertion; none for a key that is not there. Valid while the index lives.
+    /// The instances with that key, in the order in which they were added to the namespace; several only if keys are excluded.
+    /// Empty for an unknown key. Valid while the index lives.
     const TInstances& Find(const std::string& key) const;
 
-    /// How many instances share their key with an earlier one.
+    /// How many instances have the key of an earlier one.
     std::size_t CountSharing() const { return fCount - fInstances.size(); }
 
   private:
