@@ -6,8 +6,8 @@
 
 namespace NORVZEL20 {
 
-/// The records of the run as a CIM-XML document: the delta schema and the instances of KALMO_DeltaClass, KALMO_Delta and
-/// KALMO_DeltaClassAssocToDelta, in the order in which they were written. It loads like any inventory.
+/// The records of the run as a CIM-XML document that loads like any inventory: the delta schema and the instances of
+/// KALMO_DeltaClass, KALMO_Delta and KALMO_DeltaClassAssocToDelta, in the order in which the run wrote them.
 /// Errors: TZELException of the delta namespace.
 std::string WriteCimXmlReport(const TComparisonReport& report);
 

@@ -20,6 +20,7 @@ std::vector<boost::shared_ptr<ICIMProperty>> PropertiesToWrite(const ICIMInstanc
     if (names.empty()) {
         return PropertiesOf(instance);
     }
+    // The class of an instance may lack a property that the query names, because another class below the queried one has it.
     std::vector<boost::shared_ptr<ICIMProperty>> properties;
     for (const std::string& name : names) {
         if (FindPropertyDecl(*instance.GetClass(TCallContext()), name)) {
@@ -34,7 +35,7 @@ const std::string& NameOf(const ICIMProperty& property)
     return property.GetPropertyDecl(TCallContext())->GetName(TCallContext());
 }
 
-// Without the namespace, which is the same for all.
+// Without the namespace, which is the same for all instances of a listing.
 std::string PathOf(const ICIMInstance& instance)
 {
     TCIMReference path = instance.GetReference(TCallContext());
@@ -62,7 +63,7 @@ TJson InstanceAsJson(const ICIMInstance& instance, const std::vector<std::string
             {"properties", properties}};
 }
 
-// One document for all, or a line for each.
+// One document that holds all, or one line for each of them.
 std::string WriteDocuments(const TJson& documents, EOutputFormat format)
 {
     if (format == EOutputFormat::kJson) {
@@ -75,12 +76,14 @@ std::string WriteDocuments(const TJson& documents, EOutputFormat format)
     return lines;
 }
 
-// Without it, a reference into another namespace could be taken for one into the copy's own.
+// The namespace that the file named. A copy must name it too: a reference in it that names a namespace may mean this one or
+// another, and only this name tells which.
 std::string NamespaceNameOf(const TInventory& inventory)
 {
     return inventory.loaded.namesNamespace ? inventory.loaded.namespaceName : std::string();
 }
 
+// Superclasses first, each once: a document declares a class before those below it.
 void WriteClassWithSuperclasses(TCimXmlWriter& writer, const TInMemClass& cls, std::set<const TInMemClass*>& written)
 {
     if (!written.insert(&cls).second) {
@@ -92,6 +95,7 @@ void WriteClassWithSuperclasses(TCimXmlWriter& writer, const TInMemClass& cls, s
     writer.WriteClass(cls);
 }
 
+// A document that loads by itself: qualifiers, the classes that the instances need, the instances.
 std::string InstancesAsCimXml(const TInventory& inventory, const std::vector<boost::shared_ptr<ICIMInstance>>& instances)
 {
     std::string text;

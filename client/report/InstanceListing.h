@@ -17,7 +17,8 @@ namespace NORVZEL20 {
 std::string WriteInstances(const TInventory& inventory, const std::vector<boost::shared_ptr<ICIMInstance>>& instances,
                            const std::vector<std::string>& properties, EOutputFormat format);
 
-/// The classes of an inventory with the numbers of their instances; in CIM-XML the whole inventory.
+/// The classes of an inventory with the numbers of their own instances: in text as a tree, in JSON in the order of declaration. As
+/// CIM-XML the whole inventory is written, instances included.
 std::string WriteClasses(const TInventory& inventory, EOutputFormat format);
 
 }  // namespace NORVZEL20

@@ -1,3 +1,19 @@
+// The document, with one element of each list; every name and the order of the names are part of the format:
+//
+//   { "format": "cimdelta-comparison", "version": 1,
+//     "inventories": [ { "label": "web01", "file": "web01.xml", "role": "reference", "instancesCompared": 2 } ],
+//     "summary": { "differences": 1, "onlyInReference": 0, "onlyInOthers": 0, "changedValues": 1, "changedInstances": 1,
+//                  "everythingCompared": false },
+//     "differences": [ { "kind": "changed", "class": "Disk", "instance": "Disk.Id=\"sda\"", "keys": { "Id": "sda" },
+//                        "inventories": [ "web02" ], "property": "Size", "reference": { "type": "uint64", "value": 500 },
+//                        "others": [ { "inventories": [ "web02" ], "type": "uint64", "value": 250 } ] } ],
+//     "coverage": { "classes": [ { "class": "Disk", "state": "compared", "instances": [ 1, 1 ], "propertiesLeftOut": [ "Model" ],
+//                                  "excludedKeys": [], "sharingKeys": [ 0, 0 ] } ],
+//                   "classesWithoutInstances": 0,
+//                   "schema": [ { "kind": "propertyDeclared", "inventory": "web02", "asIn": "web01", "class": "Disk",
+//                                 "property": "Model" } ] } }
+//
+// A difference of another kind ends with its inventories. Lists of numbers have one for each inventory, the reference first.
 #include "client/report/JsonFormat.h"
 
 #include "client/report/JsonValue.h"

@@ -6,10 +6,11 @@
 
 namespace NORVZEL20 {
 
-/// A comparison for programs: one document with the inventories, a summary, the differences and the coverage.
+/// A comparison for programs: one document with the inventories, a summary, the differences and the coverage. Its shape is drawn in
+/// JsonFormat.cpp.
 std::string WriteJsonReport(const TComparisonReport& report);
 
-/// The same by lines: a document for each difference, and one for the coverage at the end.
+/// The same in lines: one document for each difference, and a last one of the kind "coverage" for everything else.
 std::string WriteNdjsonReport(const TComparisonReport& report);
 
 }  // namespace NORVZEL20

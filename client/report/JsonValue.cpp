@@ -14,7 +14,8 @@ TJson JsonOfReal(const TCIMValue& value)
     if (!std::isfinite(real)) {
         return value.ToText();
     }
-    // The shortest text of a real32 is not that of the real64 nearest to it.
+    // The library writes the shortest text that gives a real64 back, for 0.1f that is 0.10000000149011612. ToText knows that the
+    // value is a real32, and gives "0.1".
     return value.GetType() == TCIMValue::TCIMType::kReal32 ? TJson::parse(value.ToText(), nullptr, false) : TJson(real);
 }
 

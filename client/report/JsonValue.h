@@ -7,11 +7,11 @@
 
 namespace NORVZEL20 {
 
-/// A value in JSON: numbers exactly, booleans, null and arrays as such; text, datetimes, references (path text) and embedded
-/// objects (CIM-XML) as strings; reals that JSON has no number for as "NaN", "INF" and "-INF".
+/// A value in JSON. Null, booleans, arrays and numbers are what they are in JSON, 64-bit integers with all digits. Everything else
+/// is a string: text, datetimes, references (as path text), embedded objects (as CIM-XML), and the reals "NaN", "INF" and "-INF".
 nlohmann::ordered_json JsonOf(const TCIMValue& value);
 
-/// The document's text: two blanks of indentation, or one line where `indented` is false. Bytes that are no UTF-8 become U+FFFD.
+/// The document's text with a line end: indented by two blanks, or in one line. Bytes that are not UTF-8 become U+FFFD.
 std::string WriteJson(const nlohmann::ordered_json& document, bool indented);
 
 }  // namespace NORVZEL20

@@ -1,3 +1,18 @@
+// A report of three inventories looks like this:
+//
+//   3 differences between web01 and web02, web03: 1 instance of web01 missing elsewhere, 1 instance only elsewhere, 1 changed ...
+//
+//   Disk
+//   - Id="sda"  (not in web02)
+//   + Id="sdb"  (in web02, web03)
+//   ~ Id="sdc"
+//       Size: 500 -> web02: 250 / web03: NULL
+//
+//   Compared: 1 class; ...
+//
+// "-" is an instance of the reference that others lack, "+" one that only others have, "~" one with changed values. A value of the
+// reference stands before the arrow; inventories with equal values share one behind it. If there are only two inventories, which
+// one is meant goes without saying, and the names in brackets and before values are left out.
 #include "client/report/TTextFormat.h"
 
 #include <algorithm>
@@ -38,6 +53,7 @@ std::string TTextFormat::Summary() const
     return Counted(counts.GetTotal(), "difference") + " between " + Labels({0}) + " and " + Others() + ": " + Kinds(counts);
 }
 
+// "No differences" is said only if nothing was left out.
 std::string TTextFormat::Agreement() const
 {
     const std::string between = " between " + Labels({0}) + " and " + Others();
@@ -68,6 +84,7 @@ std::string TTextFormat::Kinds(const TComparisonReport::TCounts& counts) const
 
 void TTextFormat::WriteDifferences()
 {
+    // Differences come by class, then instance: a new name gets a new heading.
     const TDifference* previous = nullptr;
     for (const TDifference& difference : fReport.differences) {
         if (previous == nullptr || previous->className != difference.className) {
@@ -116,7 +133,7 @@ std::string TTextFormat::Values(const TDifference& difference) const
     return OneValue(difference, difference.reference) + " -> " + boost::algorithm::join(groups, " / ");
 }
 
-// The type is told where it is what differs.
+// If the types differ, the type stands before the value: the values themselves may look alike.
 std::string TTextFormat::OneValue(const TDifference& difference, const TCIMValue& value) const
 {
     const bool typesDiffer = std::any_of(difference.others.begin(), difference.others.end(), [&](const TDifference::TGroup& group) {

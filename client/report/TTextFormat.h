@@ -7,15 +7,13 @@
 
 namespace NORVZEL20 {
 
-/// A comparison for people.
-///
-/// A summary line; class by class and instance by instance what differs, marked `-` (the reference has it and others lack it), `+`
-/// (others have it) and `~` (values differ); what was compared and what was not.
+/// A comparison for people: a summary in one line, the differences by class and instance, and what was compared and what not.
 class TTextFormat {
   public:
-    /// `report` must outlive this.
+    /// `report` must outlive this. `colored` adds escape sequences for a terminal.
     TTextFormat(const TComparisonReport& report, bool colored) : fReport(report), fColored(colored) {}
 
+    /// The whole text. Names and values in it are escaped as by EscapeForDisplay.
     std::string Write();
 
   private:

@@ -11,7 +11,7 @@ namespace NORVZEL20 {
 
 namespace {
 
-// A list longer than this is told by its beginning and its length; JSON has it whole.
+// A longer list is cut, and the number of the other names stands for them. JSON has them all.
 const std::size_t kMostNames = 12;
 
 std::string SomeOf(const std::vector<std::string>& names)
@@ -23,7 +23,7 @@ std::string SomeOf(const std::vector<std::string>& names)
     return boost::algorithm::join(first, ", ") + " and " + std::to_string(names.size() - kMostNames) + " more";
 }
 
-// The paragraphs of the statement, one after the other.
+// Writes the statements, each kind by a function of its own. A kind that does not apply writes nothing.
 class TStatement {
   public:
     explicit TStatement(const TComparisonReport& report) : fReport(report), fCoverage(report.coverage) {}
@@ -92,6 +92,8 @@ class TStatement {
         }
     }
 
+    // The plug-in keeps one instance of the reference for each key, so the others that share it are not compared. Each instance
+    // of another inventory is compared, but with that one.
     void WriteSharing()
     {
         for (const TCoverage::TClass& cls : fCoverage.classes) {
@@ -123,7 +125,7 @@ class TStatement {
         }
     }
 
-    // Declarations come by the hundred: a line for each pair of inventories.
+    // There may be hundreds of declarations, so they are listed in one line for each pair of inventories.
     void WriteDeclared()
     {
         std::map<std::pair<std::size_t, std::size_t>, std::vector<std::string>> declared;
@@ -140,6 +142,7 @@ class TStatement {
         }
     }
 
+    // The line for a note that is not about a declaration; empty for one that is.
     std::string Special(const TSchemaNote& note) const
     {
         const std::string element = EscapeForDisplay(note.className + (note.property.empty() ? "" : "." + note.property));

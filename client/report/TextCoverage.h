@@ -6,7 +6,7 @@
 
 namespace NORVZEL20 {
 
-/// What was compared and what was not, and why, for people; the end of a text report.
+/// What was compared, what was not, and why, for people: the end of a text report. One statement a line.
 std::string WriteTextCoverage(const TComparisonReport& report);
 
 }  // namespace NORVZEL20
