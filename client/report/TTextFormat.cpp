@@ -145,7 +145,7 @@ std::string TTextFormat::OneValue(const TDifference& difference, const TCIMValue
 std::string TTextFormat::InstanceText(const TDifference& difference) const
 {
     const std::string keys = difference.GetKeyText();
-    return keys.empty() ? "(the class's instances; no key counts)" : EscapeForDisplay(keys);
+    return keys.empty() ? "(all instances of the class; the rules exclude every key)" : EscapeForDisplay(keys);
 }
 
 std::string TTextFormat::Labels(const std::vector<std::size_t>& inventories) const

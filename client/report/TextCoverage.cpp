@@ -155,10 +155,10 @@ class TStatement {
             return "Made in " + Label(note.inventory) + ": an instance of " + element;
         case TSchemaNote::kTypeDiffers:
             return "Of another type in " + Label(note.inventory) + " than in " + Label(note.source) +
-                   ", so equal only where both are NULL: " + element;
+                   ", so equal only if both are NULL: " + element;
         case TSchemaNote::kKeysDiffer:
             return "Identified by other keys in " + Label(note.inventory) + " than in " + Label(note.source) + ": " + element +
-                   "; instances match only under rules that exclude the keys that not both have";
+                   "; instances match only under rules that exclude the keys that one of them lacks";
         default:
             return std::string();
         }

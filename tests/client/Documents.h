@@ -46,14 +46,14 @@ inline std::string Path(const std::string& cls, const std::string& key, const st
            "</KEYVALUE></KEYBINDING></INSTANCENAME>";
 }
 
-/// The operating system that every comparison asks for.
+/// The operating system that every comparison needs.
 inline std::string System()
 {
     return Class("KALMO_OperatingSystem", "", KeyProperty("Name") + Declaration("OSType", "uint16")) +
            Instance("KALMO_OperatingSystem", Value("Name", "host") + Value("OSType", "36", "uint16"));
 }
 
-/// A document in the given namespace, or in none.
+/// A document. `ns` is the XML of its namespace, or empty for none.
 inline std::string Document(const std::string& contents, const std::string& ns = std::string())
 {
     return "<CIM CIMVERSION=\"2.0\" DTDVERSION=\"2.0\"><DECLARATION><DECLGROUP>" + ns +

@@ -13,7 +13,7 @@
 
 namespace NORVZEL20 {
 
-/// Runs commands as a person types them, among the test's inventories.
+/// Runs commands as a person types them, in the folder tests/client/data, through RunClient.
 class TClientFixture : public ::testing::Test {
   protected:
     void SetUp() override { ASSERT_EQ(0, chdir(CIMDELTA_CLIENT_TEST_DATA)); }
@@ -39,7 +39,7 @@ class TClientFixture : public ::testing::Test {
         fErr = console.fErr;
     }
 
-    /// Runs a command that must succeed in silence and returns its result.
+    /// Runs a command that must succeed without a message. Returns its result.
     std::string Result(const std::vector<std::string>& arguments)
     {
         Run(arguments);
@@ -48,7 +48,7 @@ class TClientFixture : public ::testing::Test {
         return fOut;
     }
 
-    /// Runs a command that must fail with a message and nothing else, and returns the message.
+    /// Runs a command that must end with trouble and without a result. Returns its messages.
     std::string Complaint(const std::vector<std::string>& arguments)
     {
         Run(arguments);
@@ -57,7 +57,7 @@ class TClientFixture : public ::testing::Test {
         return fErr;
     }
 
-    /// A file of that content, gone after the test. The name is as short as messages need it.
+    /// Makes a file with that content, removed after the test. Returns its path, which ends in `name`.
     std::string Scratch(const std::string& name, const std::string& content)
     {
         const std::string path = ::testing::TempDir() + "cimdelta-test-" + std::to_string(getpid()) + "-" + name;
@@ -72,7 +72,7 @@ class TClientFixture : public ::testing::Test {
         return std::string(std::istreambuf_iterator<char>(file), std::istreambuf_iterator<char>());
     }
 
-    /// The text with every occurrence of the path replaced by `name`, so that expectations need not know where scratch files are.
+    /// The text with `name` in place of every occurrence of the path: expectations cannot know where scratch files are.
     static std::string Shorten(std::string text, const std::string& path, const std::string& name)
     {
         for (std::size_t at = text.find(path); at != std::string::npos; at = text.find(path, at + name.size())) {

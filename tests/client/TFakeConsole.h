@@ -7,7 +7,7 @@
 
 namespace NORVZEL20 {
 
-/// Keeps what a command writes.
+/// Keeps what a command writes, for the test to read.
 class TFakeConsole : public IConsole {
   public:
     void WriteResult(const std::string& text) override { fOut += text; }

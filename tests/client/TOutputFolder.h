@@ -9,7 +9,7 @@
 
 namespace NORVZEL20 {
 
-/// A folder of a test's own, gone with all that is in it.
+/// A temporary folder, removed with everything in it when this object is destroyed.
 class TOutputFolder {
   public:
     TOutputFolder() : fPath(::testing::TempDir() + "cimdelta-output-XXXXXX") { EXPECT_NE(nullptr, mkdtemp(&fPath[0])); }
@@ -20,7 +20,7 @@ class TOutputFolder {
     const std::string& GetPath() const { return fPath; }
     std::string operator/(const std::string& name) const { return fPath + "/" + name; }
 
-    /// The names of what is there in their order, a blank behind each.
+    /// The names of the files in it in ascending order, each followed by a blank.
     std::string List() const
     {
         std::set<std::string> names;

@@ -8,10 +8,10 @@
 
 namespace NORVZEL20 {
 
-/// Compares two documents that stand in the test itself.
+/// Compares two documents that the test itself contains.
 class TPairFixture : public TClientFixture {
   protected:
-    /// The report of the comparison, or the complaint; the documents are called "a" and "b", without the paths of their files.
+    /// The report of the comparison, or the messages; the documents are called "a" and "b", without the paths of their files.
     std::string Compare(const std::string& a, const std::string& b, const std::vector<std::string>& options = {})
     {
         const std::string first = Scratch("a.xml", a);

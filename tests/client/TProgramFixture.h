@@ -13,7 +13,7 @@ namespace NORVZEL20 {
 /// Runs the built program itself, through a shell.
 class TProgramFixture : public TClientFixture {
   protected:
-    /// Gives exit status, standard output and standard error, one after the other.
+    /// Returns "[STATUS]", a line end, standard output, "--", a line end and standard error. `before` is put before the command.
     std::string Shell(const std::string& arguments, const std::string& before = std::string())
     {
         const std::string err = Scratch("stderr", "");

@@ -13,7 +13,7 @@ namespace NORVZEL20 {
 
 namespace {
 
-// What the shell that started the test had ignored, in the background for instance, is no concern of the program.
+// Restores the default action of ending signals in the program. A shell that runs the test in the background ignores some.
 class TSignals {
   public:
     explicit TSignals(int ignored)

@@ -11,22 +11,22 @@ namespace NORVZEL20 {
 /// The built program, running beside the test.
 class TStartedProgram {
   public:
-    /// Which of its descriptors are which of the test's; the others are the test's own. Signals do to it what they do by
-    /// themselves, except those that the test ignores by then and names in `ignored`.
+    /// Maps descriptors of the program to those of the test that it gets in their place; it inherits all others.
     using TDescriptors = std::map<int, int>;
 
+    /// Starts the program. Ending signals have their default action in it, except `ignored`, which the test ignores by then.
     explicit TStartedProgram(const std::vector<std::string>& arguments, const TDescriptors& descriptors = TDescriptors(),
                              int ignored = 0);
     TStartedProgram(const TStartedProgram&) = delete;
     TStartedProgram& operator=(const TStartedProgram&) = delete;
-    /// Kills it where it still runs.
+    /// Kills the program if it still runs.
     ~TStartedProgram();
 
     /// Whether it has ended.
     bool HasEnded();
-    /// Sends it a signal, unless it has ended.
+    /// Sends it a signal unless it has ended.
     void Signal(int number);
-    /// Waits for its end and tells it: "status 2", "signal 15".
+    /// Waits for its end. Returns how it ended: "status 2", "signal 15".
     std::string Wait();
 
   private:

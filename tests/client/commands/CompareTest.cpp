@@ -308,8 +308,8 @@ TEST_F(CompareTest, TypesAndKeysThatDifferAreToldAndCompared)
               "Declared in other-types as in web01: INV_Disk.BootId, class INV_Element, class INV_Service.\n"
               "Identified by other keys in other-types than in web01: INV_Disk; instances match only under rules that exclude the "
               "keys that "
-              "not both have.\n"
-              "Of another type in other-types than in web01, so equal only where both are NULL: INV_Package.Size.\n",
+              "one of them lacks.\n"
+              "Of another type in other-types than in web01, so equal only if both are NULL: INV_Package.Size.\n",
               Result({"compare", "web01.xml", "other-types.xml"}));
 }
 

@@ -3,7 +3,7 @@
 namespace NORVZEL20 {
 namespace {
 
-/// Inventories whose declarations do not fit together: the complaint names them, and what to do.
+/// Inventories whose declarations do not fit together: the message names them, and says what to do.
 class SchemaConflictTest : public TPairFixture {};
 
 TEST_F(SchemaConflictTest, APropertyThatAClassBelowDeclaresOtherwise)
@@ -58,14 +58,14 @@ TEST_F(SchemaConflictTest, ValuesOfDifferentTypesAreEqualWhereThereAreNone)
     };
     const std::string coverage = "\n"
                                  "Compared: 2 classes; 2 instances of a, 2 instances of b.\n"
-                                 "Of another type in b than in a, so equal only where both are NULL: Disk.Size.\n";
+                                 "Of another type in b than in a, so equal only if both are NULL: Disk.Size.\n";
     EXPECT_EQ("No differences between a and b.\n" + coverage, Compare(disk("uint32", ""), disk("uint64", "")));
     EXPECT_EQ("1 difference between a and b: 1 changed value in 1 instance\n\nDisk\n~ Id=\"1\"\n    Size: uint32 1 -> uint64 1\n" +
                   coverage,
               Compare(disk("uint32", Value("Size", "1", "uint32")), disk("uint64", Value("Size", "1", "uint64"))));
 }
 
-/// Where another inventory's operating system has keys that nobody knows values of, any will do.
+/// Keys of which nothing is known get any value of their type.
 TEST_F(SchemaConflictTest, AnOperatingSystemIsMadeWhateverTypesItsKeysHave)
 {
     std::string keys = KeyProperty("Name");
@@ -83,8 +83,7 @@ TEST_F(SchemaConflictTest, AnOperatingSystemIsMadeWhateverTypesItsKeysHave)
               Compare(declared, declared));
 }
 
-/// What is told of declarations as JSON.
-TEST_F(SchemaConflictTest, TypesAndKeysThatDifferAreToldAsJson)
+TEST_F(SchemaConflictTest, TypesAndKeysThatDifferAreReportedInJson)
 {
     const std::string one = Document(System() + Class("Disk", "", KeyProperty("Id") + Declaration("Size", "uint32")));
     const std::string other =

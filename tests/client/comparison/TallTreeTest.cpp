@@ -14,7 +14,7 @@ std::string Name(std::size_t number)
     return "C" + std::to_string(number);
 }
 
-/// An inventory of the classes from `first` to `last`, each below the one before.
+/// An inventory of the classes from `first` to `last`, each the superclass of the next.
 std::string Chain(std::size_t first, std::size_t last)
 {
     std::string text = "<CIM CIMVERSION=\"2.0\" DTDVERSION=\"2.0\"><DECLARATION><DECLGROUP>\n<VALUE.OBJECT><CLASS NAME=\"" +
@@ -25,7 +25,7 @@ std::string Chain(std::size_t first, std::size_t last)
     return text + "</DECLGROUP></DECLARATION></CIM>";
 }
 
-/// An inventory of one class with so many properties, numbered from `first` on.
+/// An inventory of one class with `count` properties, numbered from `first` on.
 std::string Wide(std::size_t first, std::size_t count)
 {
     std::string text = "<CIM CIMVERSION=\"2.0\" DTDVERSION=\"2.0\"><DECLARATION><DECLGROUP><VALUE.OBJECT><CLASS NAME=\"A\">";
@@ -48,7 +48,7 @@ boost::shared_ptr<TInMemNamespace> TallNamespace(std::size_t height)
 
 }  // namespace
 
-/// Each of the two keeps to the limit, but what the first declares below nothing is below many in the second.
+/// Neither exceeds the limit alone. Together they do: the top class of the second one is the lowest class of the first.
 TEST_F(TallTreeTest, InventoriesWhoseTreesJoinBeyondTheLimitAreRefused)
 {
     const std::string lower = Scratch("lower.xml", Chain(0, 600));

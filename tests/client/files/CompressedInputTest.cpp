@@ -7,10 +7,10 @@
 namespace NORVZEL20 {
 namespace {
 
-/// Inventories whose compressed data was damaged on the way.
+/// Inventories whose compressed data is damaged.
 class CompressedInputTest : public TClientFixture {
   protected:
-    /// What comes of showing a file of that content: its text, or the message, in which the file is called F.
+    /// Shows a file with that content. Returns its text or the message, in which F stands for the file.
     std::string Show(const std::string& content)
     {
         const std::string file = Scratch("damaged", content);
@@ -18,23 +18,23 @@ class CompressedInputTest : public TClientFixture {
         return fStatus == 2 ? Shorten(fErr, file, "F") : fOut;
     }
 
-    /// Shows what was damaged: the outcome is the very text, or the message that the file is damaged. A file of another beginning
-    /// is taken for text, and malformed. Returns whether it was refused.
+    /// Shows damaged data and returns whether it was refused. If not, the text must be unharmed. If so, the message must say that
+    /// the data is damaged; without its magic number it is taken for malformed text.
     bool IsRefused(const std::string& damaged, bool hasBeginning)
     {
         const std::string outcome = Show(damaged);
         if (outcome == fWhole) {
             return false;
         }
-        const std::string told = "cimdelta: F: cannot be read: the " + fKind + " data is damaged (";
+        const std::string message = "cimdelta: F: cannot be read: the " + fKind + " data is damaged (";
         EXPECT_EQ(2, fStatus);
         EXPECT_EQ("", fOut);
-        EXPECT_EQ(hasBeginning ? told : "cimdelta: F:1:", outcome.substr(0, hasBeginning ? told.size() : 14)) << outcome;
+        EXPECT_EQ(hasBeginning ? message : "cimdelta: F:1:", outcome.substr(0, hasBeginning ? message.size() : 14)) << outcome;
         EXPECT_EQ(outcome.size() - 1, outcome.find('\n')) << outcome;
         return true;
     }
 
-    /// Flips each bit of the file in turn, one in each byte, and cuts it at each length. Returns how many were refused.
+    /// For each byte of the file, flips one of its bits, then cuts the file before it. Returns how many of each were refused.
     std::pair<std::size_t, std::size_t> Damage(const std::string& file, std::size_t beginning)
     {
         std::pair<std::size_t, std::size_t> refused;
@@ -74,8 +74,8 @@ TEST_F(CompressedInputTest, AFlippedBitOrACutIsFoundWhereverItIs)
     const struct {
         const char* kind;
         const char* file;
-        std::size_t beginning;  // what tells the kind
-        std::size_t harmless;   // how many bytes at most say nothing about the text
+        std::size_t beginning;  // the length of the magic number
+        std::size_t harmless;   // how many bytes at most have no influence on the text
     } rows[] = {{"gzip", "web02.xml.gz", 2, 16}, {"xz", "web02.xml.xz", 6, 0}, {"zstd", "web02.xml.zst", 4, 8}};
     for (const auto& row : rows) {
         fKind = row.kind;
@@ -116,14 +116,14 @@ TEST_F(CompressedInputTest, WhatStandsBehindTheDataIsRefused)
 {
     const struct {
         const char* file;
-        const char* told;
+        const char* reason;
     } rows[] = {
         {"web02.xml.gz", "the gzip data is damaged (something else follows it)"},
         {"web02.xml.xz", "the xz data is damaged (Lzma library error: Corrupted input data)"},
         {"web02.xml.zst", "the zstd data is damaged (Zstd decompression failed: Unknown frame descriptor)"},
     };
     for (const auto& row : rows) {
-        EXPECT_EQ(std::string("cimdelta: F: cannot be read: ") + row.told + "; fetch or make it anew\n",
+        EXPECT_EQ(std::string("cimdelta: F: cannot be read: ") + row.reason + "; fetch or make it anew\n",
                   Show(ReadFile(row.file) + "<!-- garbage -->"));
         EXPECT_EQ(fWhole, Show(ReadFile(row.file)));
     }
@@ -133,7 +133,7 @@ TEST_F(CompressedInputTest, WhatStandsBehindTheDataIsRefused)
               Show(ReadFile("web02.xml.gz") + "\x1f"));
 }
 
-TEST_F(CompressedInputTest, DamageIsToldRatherThanWhatCameOfIt)
+TEST_F(CompressedInputTest, DamageIsReportedRatherThanItsConsequence)
 {
     const std::string text = ReadFile("web02.xml");
     std::string malformed = text;
@@ -145,14 +145,14 @@ TEST_F(CompressedInputTest, DamageIsToldRatherThanWhatCameOfIt)
 
 TEST_F(CompressedInputTest, OtherCompressionsAreNamed)
 {
-    const std::string told = "cimdelta: F: is compressed with K, which is not understood; gzip, xz and zstd are\n";
-    EXPECT_EQ(Shorten(told, "K", "bzip2"), Show("BZh91AY&SY"));
-    EXPECT_EQ(Shorten(told, "K", "lz4"), Show("\x04\x22\x4d\x18"));
-    EXPECT_EQ(Shorten(told, "K", "zip"), Show("PK\x03\x04\x14"));
-    EXPECT_EQ(Shorten(told, "K", "lzip"), Show("LZIP\x01"));
+    const std::string message = "cimdelta: F: is compressed with K, which is not understood; gzip, xz and zstd are\n";
+    EXPECT_EQ(Shorten(message, "K", "bzip2"), Show("BZh91AY&SY"));
+    EXPECT_EQ(Shorten(message, "K", "lz4"), Show("\x04\x22\x4d\x18"));
+    EXPECT_EQ(Shorten(message, "K", "zip"), Show("PK\x03\x04\x14"));
+    EXPECT_EQ(Shorten(message, "K", "lzip"), Show("LZIP\x01"));
 }
 
-TEST_F(CompressedInputTest, ALargeFileThatEndsEarlyIsTold)
+TEST_F(CompressedInputTest, ALargeFileThatEndsEarlyIsReported)
 {
     const std::string whole = ReadFile(CIMDELTA_PAIR_DATA "/a.xml.xz");
     EXPECT_EQ("cimdelta: F: cannot be read: the xz data is damaged (it ends early); fetch or make it anew\n",

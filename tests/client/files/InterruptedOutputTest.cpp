@@ -17,13 +17,13 @@ namespace {
 const char kLarge[] = CIMDELTA_PAIR_DATA "/a.xml.xz";
 const char kBefore[] = "what was there before";
 
-/// Results that do not get where they are to go: the program is ended, or the other end goes or waits.
+/// Results that do not arrive: the program is killed on the way, or whoever reads the result goes away or waits.
 class InterruptedOutputTest : public TProgramFixture {
   protected:
     void SetUp() override
     {
         TProgramFixture::SetUp();
-        // Some of the signals write a core file where that is allowed.
+        // Some of the signals would write a core file.
         struct rlimit core = {};
         ASSERT_EQ(0, getrlimit(RLIMIT_CORE, &core));
         core.rlim_cur = 0;
@@ -33,8 +33,8 @@ class InterruptedOutputTest : public TProgramFixture {
 
     void PutBack() { std::ofstream(fReport, std::ios::binary) << kBefore; }
 
-    /// Starts the program again and again, until it is caught with something new in the folder and before the report has its place,
-    /// and sends it the signal. Returns how it ended.
+    /// Sends the program the signal after its temporary file has appeared in the folder and before the report is complete. Repeats
+    /// that until the moment is hit. Returns how the program ended.
     std::string EndInTheMiddle(const std::vector<std::string>& arguments, int signal)
     {
         const std::string before = fFolder.List();
@@ -120,7 +120,7 @@ TEST_F(InterruptedOutputTest, AClosedStandardOutputEndsQuietly)
     EXPECT_EQ(Result({"show", "web01.xml"}), ReadFile(fReport));
 }
 
-TEST_F(InterruptedOutputTest, AStandardOutputThatIsNotForWritingIsTold)
+TEST_F(InterruptedOutputTest, AStandardOutputThatIsNotForWritingIsReported)
 {
     EXPECT_EQ("[2]\n--\ncimdelta: standard output cannot be written: Bad file descriptor\n", Shell("show web01.xml 1<web01.xml"));
 }

@@ -11,7 +11,7 @@ namespace {
 
 const char* const kForms[] = {"web02.xml", "web02.xml.gz", "web02.xml.xz", "web02.xml.zst"};
 
-/// Inventories that are read with faults, in each form.
+/// Inventories of each kind of compression, read while system calls fail or deliver little.
 class ReadingFaultTest : public TClientFixture {
   protected:
     std::string Show(const std::string& file)
@@ -34,7 +34,7 @@ TEST_F(ReadingFaultTest, FilesAreReadInWhateverPieces)
     }
 }
 
-TEST_F(ReadingFaultTest, AnErrorAnywhereIsToldWithItsReason)
+TEST_F(ReadingFaultTest, AnErrorAnywhereIsReportedWithItsReason)
 {
     for (const char* const form : kForms) {
         int number = 0;
@@ -100,14 +100,14 @@ TEST_F(ReadingFaultTest, AFileThatGrowsMeanwhileIsReadToItsEnd)
     }
 }
 
-TEST_F(ReadingFaultTest, AFileThatCannotBeOpenedIsToldWithItsReason)
+TEST_F(ReadingFaultTest, AFileThatCannotBeOpenedIsReportedWithItsReason)
 {
     TSystemCalls calls;
     calls.Fail("open", 1, EMFILE);
     EXPECT_EQ("cimdelta: F: cannot be opened: Too many open files\n", Show("web02.xml"));
 }
 
-TEST_F(ReadingFaultTest, AFileThatCannotBeReadIsTold)
+TEST_F(ReadingFaultTest, AFileThatCannotBeReadIsReported)
 {
     if (access("/proc/self/mem", R_OK) != 0) {
         GTEST_SKIP() << "/proc is not mounted, so no such file is at hand";
@@ -124,7 +124,7 @@ TEST_F(ReadingFaultTest, FewFilesAreOpenAtATime)
         const int now = ++open;
         for (int before = most; before < now && !most.compare_exchange_weak(before, now);) {
         }
-        // Long enough for all to be open, if nothing keeps them from it.
+        // Long enough that all files would be open by now if their number were not limited.
         std::this_thread::sleep_for(std::chrono::milliseconds(20));
     });
     calls.Watch("close", [&](int) { --open; });

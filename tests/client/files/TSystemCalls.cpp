@@ -80,7 +80,7 @@ auto Do(const char* name, const TCall& call) -> decltype(call())
 
 }  // namespace
 
-// The linker lets the client's calls come here (--wrap).
+// The linker directs the client's calls to these functions (--wrap).
 extern "C" {
 
 int __real_open(const char* path, int flags, ...);
@@ -122,7 +122,7 @@ int __wrap_fsync(int descriptor)
     return Do("fsync", [&] { return __real_fsync(descriptor); });
 }
 
-// What fails to close is closed nevertheless.
+// A close that fails releases the descriptor all the same, as on Linux.
 int __wrap_close(int descriptor)
 {
     const int closed = __real_close(descriptor);

@@ -8,9 +8,10 @@
 
 namespace NORVZEL20 {
 
-/// While it lives, the client's calls of the operating system go wrong as the test wants it. Other libraries' calls are left alone.
+/// While this object lives, system calls of the client fail or fall short as the test asks. Calls by other libraries do not.
 ///
-/// Threads: the calls of several may be hooked, if the functions given can stand it; one object at a time.
+/// Threads: calls from several threads are counted together; functions given to Watch may then be called concurrently. Only one
+/// object may live at a time.
 class TSystemCalls {
   public:
     TSystemCalls();
@@ -20,16 +21,17 @@ class TSystemCalls {
 
     /// The `number`-th call of that name (from 1) fails with `error`: open, read, mkostemp, write, fchmod, fsync, close, rename.
     void Fail(const std::string& call, int number, int error);
-    /// Reading and writing take at most so many bytes at a time.
+    /// From now on a read or write transfers at most so many bytes.
     void LimitPieces(std::size_t length) { fPiece = length; }
-    /// `before` is called before each call of that name, with its number.
+    /// From now on `before` is called before each call of that name, with the number of the call.
     void Watch(const std::string& call, const std::function<void(int number)>& before) { fWatches[call] = before; }
 
+    /// How many calls of that name there have been.
     int GetCount(const std::string& call) const;
 
-    /// What each hooked call asks first: 0, or what it is to fail with.
+    /// Called by each wrapped function first. Returns 0, or the errno with which the function is to fail.
     static int Enter(const char* call);
-    /// How much of `size` bytes is to be read or written.
+    /// How many of `size` bytes a read or write may transfer.
     static std::size_t Limit(std::size_t size);
 
   private:

@@ -14,7 +14,7 @@ namespace {
 
 const char kBefore[] = "what was there before";
 
-/// Results that are written while a call of the operating system fails.
+/// Results that are written while a system call fails.
 class WritingFaultTest : public TClientFixture {
   protected:
     void SetUp() override
@@ -35,7 +35,7 @@ class WritingFaultTest : public TClientFixture {
     const std::string fReport = fFolder / "report";
 };
 
-TEST_F(WritingFaultTest, EachCallThatFailsIsToldAndLeavesWhatWasThere)
+TEST_F(WritingFaultTest, EachCallThatFailsIsReportedAndLeavesWhatWasThere)
 {
     const struct {
         const char* call;
@@ -84,7 +84,7 @@ TEST_F(WritingFaultTest, AnInterruptedCallIsRepeated)
     }
 }
 
-TEST_F(WritingFaultTest, StandardOutputThatCannotBeWrittenIsTold)
+TEST_F(WritingFaultTest, StandardOutputThatCannotBeWrittenIsReported)
 {
     TSystemCalls calls;
     TStandardConsole console;
@@ -97,15 +97,15 @@ TEST_F(WritingFaultTest, StandardOutputThatCannotBeWrittenIsTold)
     }
 }
 
-TEST_F(WritingFaultTest, RulesThatCannotBeKeptAreTold)
+TEST_F(WritingFaultTest, RulesThatCannotBeKeptAreReported)
 {
     setenv("TMPDIR", fFolder.GetPath().c_str(), 1);
     for (const char* const call : {"mkostemp", "write", "close"}) {
         TSystemCalls calls;
         calls.Fail(call, call == std::string("close") ? 3 : 1, ENOSPC);
-        const std::string told = Complaint({"compare", "web01.xml", "web02.xml"});
-        EXPECT_EQ("cimdelta: " + fFolder.GetPath() + "/cimdelta-", told.substr(0, fFolder.GetPath().size() + 20)) << call;
-        EXPECT_NE(std::string::npos, told.find(": No space left on device; TMPDIR names the folder\n")) << told;
+        const std::string message = Complaint({"compare", "web01.xml", "web02.xml"});
+        EXPECT_EQ("cimdelta: " + fFolder.GetPath() + "/cimdelta-", message.substr(0, fFolder.GetPath().size() + 20)) << call;
+        EXPECT_NE(std::string::npos, message.find(": No space left on device; TMPDIR names the folder\n")) << message;
         ExpectAsBefore();
     }
     unsetenv("TMPDIR");

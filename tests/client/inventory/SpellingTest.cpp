@@ -3,7 +3,7 @@
 namespace NORVZEL20 {
 namespace {
 
-/// Inventories that say the same in other words: compared, they are equal.
+/// Inventories that spell or declare the same things differently: they compare as equal.
 class SpellingTest : public TPairFixture {};
 
 std::string Disks(const std::string& key, const std::string& binding)
@@ -77,8 +77,8 @@ TEST_F(SpellingTest, AKeyMayBeDeclaredInTheClassOrAboveIt)
               "Compared: 2 classes; 2 instances of a, 2 instances of b.\n"
               "1 class has no instances in any inventory.\n"
               "Declared in a as in b: Base.Name.\n"
-              "Identified by other keys in b than in a: Base; instances match only under rules that exclude the keys that not both "
-              "have.\n"
+              "Identified by other keys in b than in a: Base; instances match only under rules that exclude the keys that one of "
+              "them lacks.\n"
               "Spelled in b as in a: Sub.name (was Name).\n",
               Compare(Sub("", KeyProperty("name"), "name"), Sub(KeyProperty("Name"), "", "Name")));
 }

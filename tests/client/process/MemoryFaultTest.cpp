@@ -21,7 +21,7 @@ using EMode = TFailingAllocator::EMode;
 
 const int kAllCame = 10;
 
-/// Keeps what a command writes without taking memory.
+/// Keeps what a command writes, without allocating.
 class TFixedConsole : public IConsole {
   public:
     void WriteResult(const std::string& text) override { Append(fOut, fOutLength, text); }
@@ -50,7 +50,7 @@ class TFixedConsole : public IConsole {
     std::size_t fErrLength = 0;
 };
 
-/// A command, and what comes of it when there is memory.
+/// A command and its outcome when there is enough memory.
 struct TCommand {
     std::vector<const char*> arguments;
     int status = -1;
@@ -58,7 +58,7 @@ struct TCommand {
     std::string err;
 };
 
-/// Runs a command while memory runs out. Either nobody notices, or it ends with status 2, a message and no result.
+/// Runs a command while memory runs out. Either that has no effect, or the command ends with status 2, a message and no result.
 class TRunCommand : public IFaultyAction {
   public:
     explicit TRunCommand(const TCommand& command) : fCommand(command) {}
@@ -85,8 +85,8 @@ class TRunCommand : public IFaultyAction {
     int fStatus = -1;
 };
 
-/// Runs a command in a process of its own, with its `number`-th allocation failing. Gives its exit status, standard output and
-/// standard error; with a mark in front where all allocations came before that one.
+/// Runs a command in a process of its own in which the `number`-th allocation fails. Returns its exit status, standard output and
+/// standard error. If the command made fewer allocations, kAllCame is added to the status.
 std::string RunInProcess(const std::vector<const char*>& arguments, std::size_t number, EMode mode)
 {
     int ends[2];
@@ -121,11 +121,11 @@ class MemoryFaultTest : public testing::TestWithParam<EMode> {
     void SetUp() override
     {
         ASSERT_EQ(0, chdir(CIMDELTA_CLIENT_TEST_DATA));
-        // The host's texts are made when the first one is wanted, and kept.
+        // The host makes its texts when the first one is needed; do that while there is memory.
         ASSERT_STREQ("Out of memory", TZELException(TZELStatusCode::kOutOfMemory).what());
     }
 
-    /// Fails every seventh allocation of the command's own thread, in processes of their own.
+    /// Fails every seventh allocation of the command's main thread, each in a process of its own, since the process may terminate.
     static void Spend(const std::vector<const char*>& arguments)
     {
         std::vector<const char*> all(1, "cimdelta");
@@ -143,7 +143,7 @@ class MemoryFaultTest : public testing::TestWithParam<EMode> {
         EXPECT_LT(700u, number);
     }
 
-    /// Fails each allocation of the command's own thread.
+    /// Fails each allocation of the command's main thread in turn.
     static void Exhaust(const std::vector<const char*>& arguments)
     {
         TCommand command;
@@ -183,7 +183,7 @@ TEST_P(MemoryFaultTest, CheckAndExplain)
     Exhaust({"explain", "INV_Package.Version", "--spec", "rules.xml", "--schema", "web01.xml"});
 }
 
-// The library for JSON takes memory to give some back, and ends the process where it gets none: that is to be in order too.
+// The JSON library allocates in destructors, which terminates the process if it fails: that must happen in order, too.
 TEST_P(MemoryFaultTest, JsonEndsTheProcessInOrder)
 {
     Spend({"show", "web02.xml", "INV_Package", "-o", "json"});

@@ -9,10 +9,10 @@
 namespace NORVZEL20 {
 namespace {
 
-/// How many more threads are to be had; any number where it is negative.
+/// How many more threads can be started; negative for any number.
 std::atomic<int> gLeft{-1};
 
-/// Threads that the operating system refuses.
+/// The system refuses to start threads.
 class ThreadFaultTest : public TClientFixture {
   protected:
     void TearDown() override
@@ -22,7 +22,7 @@ class ThreadFaultTest : public TClientFixture {
     }
 };
 
-TEST_F(ThreadFaultTest, ThoseThatAreNotToBeHadAreDoneWithout)
+TEST_F(ThreadFaultTest, TheThreadsThatThereAreDoTheWork)
 {
     const std::vector<std::string> compare = {"compare",   "web01.xml",       "web02.xml.gz",
                                               "web03.xml", "web01-again.xml", "two-boots.xml"};
@@ -30,7 +30,7 @@ TEST_F(ThreadFaultTest, ThoseThatAreNotToBeHadAreDoneWithout)
     for (const int left : {0, 1, 2, 3}) {
         gLeft = left;
         EXPECT_EQ(expected, Result(compare)) << left;
-        EXPECT_EQ(0, gLeft) << "they are asked for";
+        EXPECT_EQ(0, gLeft) << "threads are requested";
         gLeft = left;
         EXPECT_EQ("cimdelta: none.xml: cannot be opened: No such file or directory\n",
                   Complaint({"compare", "web01.xml", "none.xml", ".", "web02.xml"}));
@@ -40,7 +40,7 @@ TEST_F(ThreadFaultTest, ThoseThatAreNotToBeHadAreDoneWithout)
 }  // namespace
 }  // namespace NORVZEL20
 
-// Found before the library's own function of that name.
+// The linker finds this before the C library's function of the same name.
 extern "C" int pthread_create(pthread_t* thread, const pthread_attr_t* attributes, void* (*start)(void*), void* argument) noexcept
 {
     using NORVZEL20::gLeft;

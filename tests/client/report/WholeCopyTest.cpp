@@ -3,7 +3,7 @@
 namespace NORVZEL20 {
 namespace {
 
-/// What `show -o cimxml` writes is the inventory again.
+/// What `show -o cimxml` writes is equal to the inventory.
 class WholeCopyTest : public TPairFixture {
   protected:
     /// The first line of the comparison of the document with its copy.

@@ -37,7 +37,7 @@ TEST(EscapeForDisplay, ShowsWhatWouldActOnATerminal)
     }
 }
 
-TEST(DisplayValue, TellsTextsApartThatLookAlike)
+TEST(DisplayValue, DistinguishesTextsThatLookAlike)
 {
     const struct {
         TCIMValue value;
