@@ -9,7 +9,7 @@
 
 int main(int argc, char** argv)
 {
-    // A closed pipe or a file that grows too large is an error of the write then, and the command ends with its own status.
+    // With these signals ignored, a closed pipe or a file that grows too large makes write() fail, and the command ends in order.
     std::signal(SIGPIPE, SIG_IGN);
     std::signal(SIGXFSZ, SIG_IGN);
     NORVZEL20::ReserveStandardDescriptors();

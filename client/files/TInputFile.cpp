@@ -1,3 +1,5 @@
+// Reading without buffers of the C library: descriptors are read in the pieces that the decompressor or the parser asks for, and
+// every error of read() is seen. The program may be started with a standard input that does not block; then poll() waits.
 #include "client/files/TInputFile.h"
 
 #include <fcntl.h>

@@ -38,7 +38,7 @@ class TUnfinishedFile {
     std::string fPath;
     int fDescriptor = -1;
     bool fIsThere = false;
-    int fSlot = -1;
+    int fSlot = -1;  // where RemoveAll finds the path; -1: nowhere
 };
 
 }  // namespace NORVZEL20

@@ -77,8 +77,7 @@ void TSchemaCompletion::SpreadWithinLimits(std::size_t source, const TInMemClass
     try {
         Spread(source, cls, target);
     } catch (const TSchemaLimitError& error) {
-        throw TClientError(fInventories[target].path + ": class " + cls.GetName() + " of " + fInventories[source].path +
-                           " cannot be declared here: " + error.what());
+        Refuse(source, "class " + cls.GetName(), target, error.what());
     }
 }
 
@@ -116,9 +115,8 @@ void TSchemaCompletion::Declare(std::size_t source, const TInMemClass& cls, std:
     } catch (const TSchemaLimitError&) {
         throw;
     } catch (const TZELException& error) {
-        throw TClientError(fInventories[target].path + ": class " + cls.GetName() + " of " + fInventories[source].path +
-                           " cannot be declared here: " + error.what() +
-                           "; a superclass has a property of another type in the two inventories");
+        Refuse(source, "class " + cls.GetName(), target,
+               error.what() + std::string("; a superclass has a property of another type in the two inventories"));
     }
 }
 
@@ -130,9 +128,8 @@ void TSchemaCompletion::DeclareProperty(std::size_t source, const TInMemProperty
     } catch (const TSchemaLimitError&) {
         throw;
     } catch (const TZELException&) {
-        throw TClientError(fInventories[target].path + ": property " + property.GetName() + " of class " + there.GetName() +
-                           " of " + fInventories[source].path + " cannot be declared here: " + DescribeConflict(there, property) +
-                           "; give them one type in both inventories, or another name");
+        Refuse(source, "property " + property.GetName() + " of class " + there.GetName(), target,
+               DescribeConflict(there, property) + "; give them one type in both inventories, or another name");
     }
     Note(TSchemaNote::kPropertyDeclared, target, source, there.GetName(), property.GetName());
 }
@@ -153,6 +150,12 @@ void TSchemaCompletion::Respell(std::size_t source, const TInMemClass& cls, std:
             Note(TSchemaNote::kPropertyRespelled, target, source, cls.GetName(), name, before);
         }
     }
+}
+
+void TSchemaCompletion::Refuse(std::size_t source, const std::string& element, std::size_t target, const std::string& reason) const
+{
+    throw TClientError(fInventories[target].path + ": " + element + " of " + fInventories[source].path +
+                       " cannot be declared here: " + reason);
 }
 
 void TSchemaCompletion::Note(TSchemaNote::EKind kind, std::size_t target, std::size_t source, const std::string& className,

@@ -31,6 +31,7 @@ class TSchemaCompletion {
     void Declare(std::size_t source, const TInMemClass& cls, std::size_t target);
     void DeclareProperty(std::size_t source, const TInMemPropertyDecl& property, std::size_t target, TInMemClass& there);
     void Respell(std::size_t source, const TInMemClass& cls, std::size_t target);
+    [[noreturn]] void Refuse(std::size_t source, const std::string& element, std::size_t target, const std::string& reason) const;
     void Note(TSchemaNote::EKind kind, std::size_t target, std::size_t source, const std::string& className,
               const std::string& property, const std::string& before = std::string());
     void AdaptReferences();

@@ -1,3 +1,11 @@
+// What `query` and `show` write. Instances of two properties, as text and as JSON:
+//
+//   Disk.Id="sda"                  { "class": "Disk", "instance": "Disk.Id=\"sda\"", "properties": { "Id": "sda", "Size": 500 } }
+//       Id: sda
+//       Size: 500
+//
+// JSON is one array of these, NDJSON a line for each. CIM-XML is different: it cannot leave out properties, and must bring along
+// the declarations without which it would not load.
 #include "client/report/InstanceListing.h"
 
 #include <set>

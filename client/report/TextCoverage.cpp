@@ -1,3 +1,13 @@
+// The end of a report, one statement a line; only the first is always there:
+//
+//   Compared: 2 classes; 30 instances of web01, 28 instances of web02.
+//   3 classes have no instances in any inventory.
+//   Not compared, because the rules exclude every property: Process (12 / 7).
+//   Properties of Disk not compared: Caption, Model.
+//   Instances of Disk that share their key with another one, since the rules leave out Bus: 2 of web01; those of web01 were not
+//   compared. Declared in web02 as in web01: class Tape, Disk.Model. Made in web02: an instance of KALMO_OperatingSystem.
+//
+// Numbers with slashes between them are those of the inventories, the reference first.
 #include "client/report/TextCoverage.h"
 
 #include <boost/algorithm/string/join.hpp>
