@@ -4,6 +4,7 @@
 #include <cstring>
 
 #include "client/process/TClientError.h"
+#include "client/process/TReaderGone.h"
 #include "client/process/TStandardConsole.h"
 #include "tests/client/TClientFixture.h"
 #include "tests/client/TOutputFolder.h"
@@ -95,6 +96,14 @@ TEST_F(WritingFaultTest, StandardOutputThatCannotBeWrittenIsReported)
     } catch (const TClientError& error) {
         EXPECT_STREQ("standard output cannot be written: Input/output error", error.what());
     }
+}
+
+TEST_F(WritingFaultTest, AReaderThatHasGoneIsNoTroubleToReport)
+{
+    TSystemCalls calls;
+    TStandardConsole console;
+    calls.Fail("write", 1, EPIPE);
+    EXPECT_THROW(console.WriteResult("a result"), TReaderGone);
 }
 
 TEST_F(WritingFaultTest, RulesThatCannotBeKeptAreReported)
