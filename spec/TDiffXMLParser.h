@@ -61,9 +61,13 @@ class TCIMDiffEngine::TDiffXMLParser : public TXmlParser {
     [[noreturn]] void PassOn(const char* event, const TZELException& error);
 
     TRuleset fRuleset;
-    boost::shared_ptr<TDiffClassRules> fCurrentRules;  // of the class being read; null before the first
-    std::deque<boost::shared_ptr<TParseState>> fStateStack;
-    std::string fCharData;
+
+  protected:
+    boost::shared_ptr<TDiffClassRules> fCurrentRules;        ///< of the class being read; null before the first
+    std::deque<boost::shared_ptr<TParseState>> fStateStack;  ///< the states, that of the document first
+    std::string fCharData;                                   ///< the text collected since a "value" began or ended
+
+  private:
     boost::shared_ptr<ICIMNamespace> fSchema;
 };
 

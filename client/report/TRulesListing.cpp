@@ -33,8 +33,10 @@ std::vector<std::string> PropertyNames(const TInMemClass& cls)
     return names;
 }
 
-std::size_t CountWithSubclasses(const TInMemClass& cls)
+std::size_t CountWithSubclasses(TInMemNamespace& ns, const std::string& className)
 {
+    // Not FindClass, which does not know the root class.
+    const auto& cls = dynamic_cast<const TInMemClass&>(*ns.GetClass(className, TCallContext()));
     std::size_t count = cls.GetInstanceCount();
     for (const boost::shared_ptr<TInMemClass>& below : cls.GetClassesBelow()) {
         count += below->GetInstanceCount();
@@ -45,8 +47,7 @@ std::size_t CountWithSubclasses(const TInMemClass& cls)
 }  // namespace
 
 TRulesListing::TRulesListing(const std::string& file, const TInventory& schema)
-    : fFile(file), fSchema(schema), fRules(schema.ns, file, file), fDocument(TRulesDocument::Read(file)),
-      fTrace(fDocument, schema.ns)
+    : fFile(file), fSchema(schema), fRules(schema.ns, file, file), fDocument(fRules.GetDocument()), fTrace(fDocument, schema.ns)
 {}
 
 std::string TRulesListing::WriteCheck()
@@ -107,8 +108,7 @@ void TRulesListing::WriteUnmatched()
 {
     std::string unmatched;
     for (const TRulesDocument::TElement& element : fDocument.elements) {
-        const boost::shared_ptr<TInMemClass> cls = fSchema.ns->FindClass(element.className);
-        if (CountWithSubclasses(*cls) == 0) {
+        if (CountWithSubclasses(*fSchema.ns, element.className) == 0) {
             unmatched += "  " +
                          EscapeForDisplay(fFile + ":" + std::to_string(element.line) + ": class " + element.className +
                                           " has no instances, nor has any class below it") +

@@ -43,7 +43,7 @@ class TRulesListing {
     const std::string fFile;
     const TInventory& fSchema;
     TRules fRules;
-    const TRulesDocument fDocument;
+    const TRulesDocument& fDocument;
     const TRuleTrace fTrace;
     std::string fOut;
 };

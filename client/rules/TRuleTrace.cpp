@@ -1,62 +1,52 @@
+// The elements are merged one after the other, as marks that say which element decides where (TRuleMarks). Warnings come from
+// looking at the marks around each merge:
+//
+//     before   rules of the class are complete             the element has no effect
+//              the class has rules already                 its excluded keys have no effect
+//     after    a class below has this element's default,   that element came too early
+//              but an element of its own came before
+//
+// What is odd in an element by itself (letter case, repeated names, keys that are none) needs only the schema.
 #include "client/rules/TRuleTrace.h"
 
 #include <algorithm>
 #include <set>
+#include <tuple>
+#include <utility>
 
 #include "client/inventory/CollectObjects.h"
 #include "embedded/value/TNameText.h"
+#include "host/TAddToVectorCallback.h"
 
 namespace NORVZEL20 {
 
-namespace {
-
-std::string Line(unsigned int line)
+TRuleTrace::TRuleTrace(const TRulesDocument& document, boost::shared_ptr<ICIMNamespace> schema)
+    : fElements(document.elements), fSchema(schema), fMarks(document.elements, schema)
 {
-    return "line " + std::to_string(line);
-}
-
-TRuleTrace::TClass MakeEntry(const TRulesDocument::TElement& element)
-{
-    TRuleTrace::TClass entry;
-    entry.byDefault = {element.defaultTreatment, element.className, element.line, false};
-    for (const TRulesDocument::TListed& listed : element.listed) {
-        entry.listed.insert({listed.property, {listed.treatment, element.className, listed.line, true}});
+    for (std::size_t index = 0; index < fElements.size(); ++index) {
+        CheckNames(index);
+        Apply(index);
     }
-    entry.excludedKeys = element.excludedKeys;
-    entry.excludedKeysLine = element.line;
-    return entry;
-}
-
-// A class that rules flow down to, and whose they are.
-struct TClassBelow {
-    boost::shared_ptr<ICIMClass> cls;
-    std::string parent;
-};
-
-// The plug-in's merge: the other's default and listed properties prevail, excluded keys stay as they are.
-void Merge(TRuleTrace::TClass& entry, const TRuleTrace::TClass& other)
-{
-    entry.byDefault = other.byDefault;
-    for (const auto& listed : other.listed) {
-        entry.listed[listed.first] = listed.second;
-    }
-}
-
-}  // namespace
-
-TRuleTrace::TRuleTrace(const TRulesDocument& document, boost::shared_ptr<ICIMNamespace> schema) : fSchema(schema)
-{
-    for (const TRulesDocument::TElement& element : document.elements) {
-        CheckNames(element);
-        Apply(element);
-    }
-    std::stable_sort(fWarnings.begin(), fWarnings.end(), [](const TWarning& a, const TWarning& b) { return a.line < b.line; });
+    std::stable_sort(fWarnings.begin(), fWarnings.end(), [](const TWarning& a, const TWarning& b) {
+        return std::tie(a.element, a.line) < std::tie(b.element, b.line);
+    });
 }
 
 TRuleTrace::TClass TRuleTrace::Find(const std::string& className) const
 {
-    const auto found = fClasses.find(className);
-    return found == fClasses.end() ? TClass() : found->second;
+    TClass entry;
+    const std::optional<std::size_t> byDefault = fMarks.FindDefault(className);
+    if (!byDefault) {
+        return entry;
+    }
+    entry.byDefault = MakeDefault(*byDefault);
+    for (const auto& [property, index] : fMarks.FindListed(className)) {
+        entry.listed[property] = MakeListed(index, property);
+    }
+    const TRulesDocument::TElement& keys = fElements[*fMarks.FindKeys(className)];
+    entry.excludedKeys = keys.excludedKeys;
+    entry.excludedKeysLine = keys.line;
+    return entry;
 }
 
 TRuleTrace::TDecision TRuleTrace::Decide(const std::string& className, const std::string& property) const
@@ -66,122 +56,123 @@ TRuleTrace::TDecision TRuleTrace::Decide(const std::string& className, const std
     if (exact != entry.listed.end()) {
         return exact->second;
     }
-    // An included name is asked of the instances as it is spelled, and they do not mind letter case; an excluded one is compared
-    // with the declarations, which do.
-    for (const auto& listed : entry.listed) {
-        if (entry.byDefault.treatment == TCIMDiffEngine::EXCLUDE && listed.second.treatment == TCIMDiffEngine::INCLUDE &&
-            TNameText::Equal(listed.first, property)) {
-            return listed.second;
+    // Instances find an included property in any letter case. An excluded one is compared byte for byte with the declared names.
+    for (const auto& [name, decision] : entry.listed) {
+        if (entry.byDefault.treatment == TCIMDiffEngine::EXCLUDE && decision.treatment == TCIMDiffEngine::INCLUDE &&
+            TNameText::Equal(name, property)) {
+            return decision;
         }
     }
     return entry.byDefault;
 }
 
-void TRuleTrace::Apply(const TRulesDocument::TElement& element)
+void TRuleTrace::Apply(std::size_t index)
 {
-    const auto known = fClasses.find(element.className);
-    if (known == fClasses.end()) {
-        fClasses.insert({element.className, MakeEntry(element)});
-    } else {
-        MergeOwn(known->second, element);
-    }
-    fOwnLines.insert({element.className, element.line});
-    PushDown(element.className, element);
+    WarnOfLateness(index);
+    fMarks.Merge(index);
+    WarnOfOverruled(index);
+    fFirst.insert({fElements[index].className, index});
 }
 
-void TRuleTrace::MergeOwn(TClass& entry, const TRulesDocument::TElement& element)
+void TRuleTrace::WarnOfLateness(std::size_t index)
 {
-    const auto own = fOwnLines.find(element.className);
-    if (entry.isFinal) {
-        Warn(element.line, "this element for class " + element.className +
-                               " has no effect: the class's rules were complete before it (its first element is at " +
-                               Line(own->second) + "); put everything into one element");
+    const TRulesDocument::TElement& element = fElements[index];
+    const std::optional<std::size_t> decider = fMarks.FindDefault(element.className);
+    if (!decider) {
         return;
     }
-    if (!element.excludedKeys.empty()) {
-        const std::string reason = own == fOwnLines.end()
-                                       ? "the class already has the rules of its ancestor " + entry.byDefault.fromClass + " (" +
-                                             Line(entry.byDefault.line) + "); put this element before that one"
-                                       : "the class already has an element at " + Line(own->second) + "; name the keys there";
-        Warn(element.line, "excludekeys of class " + element.className + " has no effect: " + reason);
+    const auto first = fFirst.find(element.className);
+    if (fMarks.IsFinal(element.className)) {
+        Warn(index, element.line,
+             "this element for class " + element.className +
+                 " has no effect: the class's rules were complete before it (its first element is at " + LineOf(first->second) +
+                 "); put everything into one element");
+    } else if (!element.excludedKeys.empty()) {
+        const std::string reason = first == fFirst.end()
+                                       ? "the class already has the rules of its ancestor " + fElements[*decider].className + " (" +
+                                             LineOf(*decider) + "); put this element before that one"
+                                       : "the class already has an element at " + LineOf(first->second) + "; name the keys there";
+        Warn(index, element.line, "excludekeys of class " + element.className + " has no effect: " + reason);
     }
-    Merge(entry, MakeEntry(element));
-    entry.isFinal = true;
 }
 
-void TRuleTrace::PushDown(const std::string& className, const TRulesDocument::TElement& origin)
+void TRuleTrace::WarnOfOverruled(std::size_t index)
 {
-    std::vector<TClassBelow> open;
-    const auto addSubclasses = [&open](ICIMClass& cls, const std::string& name) {
-        const std::vector<boost::shared_ptr<ICIMClass>> subclasses = SubclassesOf(cls);
-        for (auto sub = subclasses.rbegin(); sub != subclasses.rend(); ++sub) {
-            open.push_back({*sub, name});
+    const TRulesDocument::TElement& element = fElements[index];
+    std::vector<boost::shared_ptr<ICIMClass>> below;
+    fSchema->GetClass(element.className, TCallContext())
+        ->EnumerateSubClasses(TAddToVectorCallback<ICIMClass>(&below), true, TCallContext());
+    for (const boost::shared_ptr<ICIMClass>& cls : below) {
+        const auto own = fFirst.find(cls->GetName(TCallContext()));
+        if (own != fFirst.end() && fMarks.FindDefault(own->first) == index) {
+            Warn(own->second, fElements[own->second].line,
+                 "the element for class " + own->first + " is read before that of its ancestor " + element.className + " (" +
+                     LineOf(index) + "), whose default and lists replace its own; put the ancestor first");
         }
-    };
-    addSubclasses(*fSchema->GetClass(className, TCallContext()), className);
-    while (!open.empty()) {
-        const TClassBelow below = open.back();
-        open.pop_back();
-        const std::string name = below.cls->GetName(TCallContext());
-        Inherit(name, fClasses.at(below.parent), origin);
-        addSubclasses(*below.cls, name);
     }
 }
 
-void TRuleTrace::Inherit(const std::string& className, const TClass& parent, const TRulesDocument::TElement& origin)
+void TRuleTrace::CheckNames(std::size_t index)
 {
-    const auto known = fClasses.find(className);
-    if (known == fClasses.end()) {
-        fClasses.insert({className, parent});
-        return;
-    }
-    if (known->second.isFinal) {
-        return;
-    }
-    const auto own = fOwnLines.find(className);
-    if (own != fOwnLines.end() && own->second < origin.line) {
-        Warn(own->second, "the element for class " + className + " is read before that of its ancestor " + origin.className + " (" +
-                              Line(origin.line) + "), whose default and lists replace its own; put the ancestor first");
-    }
-    Merge(known->second, parent);
-}
-
-void TRuleTrace::CheckNames(const TRulesDocument::TElement& element)
-{
+    const TRulesDocument::TElement& element = fElements[index];
     const boost::shared_ptr<ICIMClass> cls = fSchema->GetClass(element.className, TCallContext());
     const std::string& declared = cls->GetName(TCallContext());
     if (declared != element.className) {
-        Warn(element.line, "class " + element.className + " is declared as " + declared +
-                               "; letter case counts in rules, so this element reaches no class of that name");
+        Warn(index, element.line,
+             "class " + element.className + " is declared as " + declared +
+                 "; letter case counts in rules, so this element reaches no class of that name");
     }
     std::set<std::string> seen;
     for (const TRulesDocument::TListed& listed : element.listed) {
         const std::string& name = cls->GetPropertyDecl(listed.property, TCallContext())->GetName(TCallContext());
         if (name != listed.property) {
-            Warn(listed.line, "property " + listed.property + " of class " + element.className + " is declared as " + name +
-                                  "; letter case counts in rules");
+            Warn(index, listed.line,
+                 "property " + listed.property + " of class " + element.className + " is declared as " + name +
+                     "; letter case counts in rules");
         }
         if (!seen.insert(listed.property).second) {
-            Warn(listed.line, "property " + listed.property + " of class " + element.className +
-                                  " is listed before in this element; the first listing counts");
+            Warn(index, listed.line,
+                 "property " + listed.property + " of class " + element.className +
+                     " is listed before in this element; the first listing counts");
         }
     }
-    CheckKeys(element, *cls);
+    CheckKeys(index, *cls);
 }
 
-void TRuleTrace::CheckKeys(const TRulesDocument::TElement& element, ICIMClass& cls)
+void TRuleTrace::CheckKeys(std::size_t index, ICIMClass& cls)
 {
+    const TRulesDocument::TElement& element = fElements[index];
     const std::vector<std::string> keys = KeyNamesOf(cls);
     for (const std::string& key : element.excludedKeys) {
         if (std::find(keys.begin(), keys.end(), key) == keys.end()) {
-            Warn(element.line, "excluded key " + key + " is no key of class " + element.className);
+            Warn(index, element.line, "excluded key " + key + " is not a key of class " + element.className);
         }
     }
 }
 
-void TRuleTrace::Warn(unsigned int line, const std::string& text)
+void TRuleTrace::Warn(std::size_t index, unsigned int line, const std::string& text)
 {
-    fWarnings.push_back({line, text});
+    fWarnings.push_back({index, line, text});
+}
+
+TRuleTrace::TDecision TRuleTrace::MakeDefault(std::size_t index) const
+{
+    const TRulesDocument::TElement& element = fElements[index];
+    return {element.defaultTreatment, element.className, element.line, false};
+}
+
+// The first listing counts, as in the plug-in.
+TRuleTrace::TDecision TRuleTrace::MakeListed(std::size_t index, const std::string& property) const
+{
+    const TRulesDocument::TElement& element = fElements[index];
+    const auto first = std::find_if(element.listed.begin(), element.listed.end(),
+                                    [&property](const TRulesDocument::TListed& listed) { return listed.property == property; });
+    return {first->treatment, element.className, first->line, true};
+}
+
+std::string TRuleTrace::LineOf(std::size_t index) const
+{
+    return "line " + std::to_string(fElements[index].line);
 }
 
 }  // namespace NORVZEL20

@@ -5,24 +5,22 @@
 #include <string>
 #include <vector>
 
+#include "client/rules/TRuleMarks.h"
 #include "client/rules/TRulesDocument.h"
 #include "host/ICIMClass.h"
 #include "host/ICIMNamespace.h"
 
 namespace NORVZEL20 {
 
-/// Which element of a rules file decides what, class by class.
-///
-/// Repeats the plug-in's merging (an element merges into what its class has, then flows down to all subclasses) and notes the
-/// origin of each treatment on the way. The treatments themselves are the plug-in's; this only explains them.
+/// Which element of a rules file decides what, class by class, and what its author may not have meant.
 class TRuleTrace {
   public:
     /// A treatment and the element that gave it.
     struct TDecision {
         TCIMDiffEngine::propType treatment = TCIMDiffEngine::EXCLUDE;
-        std::string fromClass;  ///< the class that the element is for; empty where no element reached the class
+        std::string fromClass;  ///< the class that the element is for; empty if no element reached the class
         unsigned int line = 0;  ///< the line of the element, or of the listed property
-        bool isListed = false;  ///< whether a list names the property, or else the default decides
+        bool isListed = false;  ///< whether a list names the property; otherwise the default decides
     };
 
     /// What holds for one class.
@@ -31,38 +29,43 @@ class TRuleTrace {
         std::map<std::string, TDecision> listed;
         std::vector<std::string> excludedKeys;
         unsigned int excludedKeysLine = 0;
-        bool isFinal = false;
     };
 
-    /// Something that the rules allow and that their author hardly means.
+    /// Something that is allowed but that the author hardly means.
     struct TWarning {
+        std::size_t element;  ///< the position of the element that it is about
         unsigned int line;
         std::string text;
     };
 
+    /// `document` is what the plug-in accepted for `schema`; it must outlive this. Errors: those of the schema.
     TRuleTrace(const TRulesDocument& document, boost::shared_ptr<ICIMNamespace> schema);
 
-    /// The class's entry; one that excludes everything, from nowhere, where no element reached it.
+    /// The class's entry; if no element reached it, one that excludes everything.
     TClass Find(const std::string& className) const;
 
-    /// What decides the property: its own listing or the default.
+    /// What decides the property: its listing or the default.
     TDecision Decide(const std::string& className, const std::string& property) const;
 
-    /// In ascending order of their lines.
+    /// In the order of the elements that they are about, then of their lines.
     const std::vector<TWarning>& GetWarnings() const { return fWarnings; }
 
   private:
-    void Apply(const TRulesDocument::TElement& element);
-    void MergeOwn(TClass& entry, const TRulesDocument::TElement& element);
-    void PushDown(const std::string& className, const TRulesDocument::TElement& origin);
-    void Inherit(const std::string& className, const TClass& parent, const TRulesDocument::TElement& origin);
-    void CheckNames(const TRulesDocument::TElement& element);
-    void CheckKeys(const TRulesDocument::TElement& element, ICIMClass& cls);
-    void Warn(unsigned int line, const std::string& text);
+    void Apply(std::size_t index);
+    void WarnOfLateness(std::size_t index);
+    void WarnOfOverruled(std::size_t index);
+    void CheckNames(std::size_t index);
+    void CheckKeys(std::size_t index, ICIMClass& cls);
+    void Warn(std::size_t index, unsigned int line, const std::string& text);
 
+    TDecision MakeDefault(std::size_t index) const;
+    TDecision MakeListed(std::size_t index, const std::string& property) const;
+    std::string LineOf(std::size_t index) const;
+
+    const std::vector<TRulesDocument::TElement>& fElements;
     boost::shared_ptr<ICIMNamespace> fSchema;
-    std::map<std::string, TClass> fClasses;
-    std::map<std::string, unsigned int> fOwnLines;  // the first own element of each class
+    TRuleMarks fMarks;
+    std::map<std::string, std::size_t> fFirst;  // the first element for each class, of those applied
     std::vector<TWarning> fWarnings;
 };
 

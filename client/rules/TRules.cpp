@@ -4,17 +4,20 @@
 
 #include <algorithm>
 
+#include "client/files/TInputFile.h"
 #include "client/process/LackOfMemory.h"
 #include "client/process/SystemError.h"
 #include "client/process/TClientError.h"
-#include "client/rules/RulesFault.h"
 #include "client/rules/TLogCapture.h"
+#include "client/rules/TRulesParser.h"
 #include "host/TZELException.h"
 #include "provider/DeltaNames.h"
 
 namespace NORVZEL20 {
 
 namespace {
+
+const std::size_t kBlockSize = 64 * 1024;
 
 void CheckFile(const std::string& file)
 {
@@ -35,24 +38,35 @@ void CheckFile(const std::string& file)
     }
 }
 
-TCIMDiffEngine::TRuleset ReadRuleset(TCIMDiffEngine& engine, const std::string& file, const std::string& shownName)
+std::string ReadWhole(const std::string& path)
 {
-    CheckFile(file);
-    const TLogCapture log;
-    try {
-        return engine.ReadSpecFile(file);
-    } catch (const TZELException& error) {
-        ThrowIfOutOfMemory(error);
-        throw TClientError(DescribeRulesFault(file, shownName, log.GetMessages(), error));
+    TInputFile file(path == "-" ? "./-" : path);  // rules never come from standard input
+    std::string text;
+    std::vector<char> block(kBlockSize);
+    while (const std::size_t count = file.Read(block.data(), block.size())) {
+        text.append(block.data(), count);
     }
+    return text;
 }
 
 }  // namespace
 
 TRules::TRules(boost::shared_ptr<ICIMNamespace> schema, const std::string& file, const std::string& shownName)
-    : fSchemas(1, schema), fEngine(boost::shared_ptr<ICIMNamespace>(), fSchemas, std::string()),
-      fRuleset(ReadRuleset(fEngine, file, shownName))
-{}
+    : fSchemas(1, schema), fEngine(boost::shared_ptr<ICIMNamespace>(), fSchemas, std::string())
+{
+    CheckFile(file);
+    std::string text = ReadWhole(file);
+    TRulesParser parser(schema);
+    const TLogCapture log;  // keeps the plug-in's own words from the person, who gets the client's
+    try {
+        parser.Parse(text.data(), text.size());
+    } catch (const TZELException& error) {
+        ThrowIfOutOfMemory(error);
+        throw TClientError(parser.GetFault().Describe(shownName));
+    }
+    fRuleset = parser.getRuleset();
+    fDocument = parser.GetDocument();
+}
 
 std::vector<std::string> TRules::PropertiesOf(const boost::shared_ptr<ICIMClass>& cls)
 {

@@ -4,6 +4,7 @@
 #include <string>
 #include <vector>
 
+#include "client/rules/TRulesDocument.h"
 #include "engine/TCIMDiffEngine.h"
 #include "host/ICIMClass.h"
 #include "host/ICIMInstance.h"
@@ -12,10 +13,10 @@
 
 namespace NORVZEL20 {
 
-/// A rules file as the plug-in understands it: the plug-in's own reading, and its own answers to what follows from it.
+/// A rules file as the plug-in's own parser reads it, and the plug-in's own answers to what follows from it.
 class TRules {
   public:
-    /// Reads the file with `schema` as the reference. `shownName` is what messages call it.
+    /// Reads the file once, as a whole, with `schema` as the reference. Messages call it `shownName`.
     /// Errors: TClientError that names the file, the line, what is wrong there and what can be done.
     TRules(boost::shared_ptr<ICIMNamespace> schema, const std::string& file, const std::string& shownName);
     TRules(const TRules&) = delete;
@@ -33,12 +34,16 @@ class TRules {
     /// Whether any class excludes any key.
     bool HasExcludedKeys() const;
 
+    /// What the file says, element by element.
+    const TRulesDocument& GetDocument() const { return fDocument; }
+
   private:
     boost::shared_ptr<TCIMDiffEngine::TDiffClassRules> Find(const std::string& className);
 
     std::vector<boost::shared_ptr<ICIMNamespace>> fSchemas;
     TCIMDiffEngine fEngine;
     TCIMDiffEngine::TRuleset fRuleset;
+    TRulesDocument fDocument;
     std::string fFoundName;  // the class looked up last: instances come class by class
     boost::shared_ptr<TCIMDiffEngine::TDiffClassRules> fFound;
 };

@@ -1,6 +1,5 @@
 #pragma once
 
-#include <map>
 #include <string>
 #include <vector>
 
@@ -8,7 +7,8 @@
 
 namespace NORVZEL20 {
 
-/// What a specification file says, in its order and with its lines, for telling a person where a rule comes from.
+/// What a rules file says, in its order and with its lines. Several elements may stand on one line: an element is known by its
+/// position here, and its line is only for display.
 struct TRulesDocument {
     /// A property named in a list.
     struct TListed {
@@ -23,17 +23,10 @@ struct TRulesDocument {
         TCIMDiffEngine::propType defaultTreatment = TCIMDiffEngine::EXCLUDE;
         std::vector<std::string> excludedKeys;
         unsigned int line = 0;
-        std::vector<TListed> listed;  ///< in the order read; of several with one name the first one counts
+        std::vector<TListed> listed;  ///< in the order read; if a property is listed twice, the first listing counts
     };
 
     std::vector<TElement> elements;
-
-    /// Reads a file that the plug-in accepts; of any other, what stands before the first fault in its XML.
-    /// Errors: TClientError where the file cannot be read.
-    static TRulesDocument Read(const std::string& path);
-
-    /// The element that `line` belongs to: the last one that begins there or before; null where there is none.
-    const TElement* FindByLine(unsigned int line) const;
 };
 
 }  // namespace NORVZEL20

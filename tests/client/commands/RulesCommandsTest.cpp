@@ -34,7 +34,7 @@ TEST_F(RulesCommandsTest, CheckWarnsOfWhatAnAuthorHardlyMeans)
         "replace its own; put the ancestor first\n"
         "  odd-rules.xml:9: class inv_disk is declared as INV_Disk; letter case counts in rules, so this element reaches no class "
         "of that name\n"
-        "  odd-rules.xml:10: excluded key Bootid is no key of class INV_Disk\n"
+        "  odd-rules.xml:10: excluded key Bootid is not a key of class INV_Disk\n"
         "  odd-rules.xml:13: property size of class INV_Package is declared as Size; letter case counts in rules\n"
         "  odd-rules.xml:17: property Version of class INV_Package is listed before in this element; the first listing counts\n"
         "  odd-rules.xml:20: excludekeys of class INV_Package has no effect: the class already has an element at line 11; name the "

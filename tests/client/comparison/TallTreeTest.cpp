@@ -84,14 +84,14 @@ TEST_F(TallTreeTest, WalkingTakesNoStack)
     EXPECT_EQ("C99999", classes.back()->GetName(TCallContext()));
 }
 
-TEST_F(TallTreeTest, RulesFlowDownWithoutTakingStack)
+TEST_F(TallTreeTest, RulesFlowDownToTheLimit)
 {
     TRulesDocument document;
     document.elements.emplace_back();
     document.elements.back().className = "C0";
     document.elements.back().defaultTreatment = TCIMDiffEngine::INCLUDE;
-    const boost::shared_ptr<TInMemNamespace> ns = TallNamespace(100000);
-    EXPECT_EQ("C0", TRuleTrace(document, ns).Find("C99999").byDefault.fromClass);
+    const boost::shared_ptr<TInMemNamespace> ns = TallNamespace(1001);
+    EXPECT_EQ("C0", TRuleTrace(document, ns).Find("C1000").byDefault.fromClass);
 }
 
 }  // namespace NORVZEL20

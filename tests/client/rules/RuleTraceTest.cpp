@@ -11,6 +11,8 @@
 namespace NORVZEL20 {
 namespace {
 
+const char* const kClasses[] = {"A", "B", "C", "D", "E"};
+
 // A small tree: A above B and C, B above D and E; each declares p, q and r through A.
 boost::shared_ptr<TInMemNamespace> MakeSchema()
 {
@@ -31,13 +33,13 @@ boost::shared_ptr<TInMemNamespace> MakeSchema()
     return ns;
 }
 
-TRulesDocument MakeRandomDocument(std::mt19937& random)
+TRulesDocument MakeRandomDocument(std::mt19937& random, unsigned int mostElements)
 {
     const auto choose = [&random](unsigned int count) { return static_cast<unsigned int>(random() % count); };
     const auto treatment = [&choose] { return choose(2) == 0 ? TCIMDiffEngine::INCLUDE : TCIMDiffEngine::EXCLUDE; };
     TRulesDocument document;
     unsigned int line = 1;
-    for (unsigned int i = choose(7); i > 0; --i) {
+    for (unsigned int i = choose(mostElements + 1); i > 0; --i) {
         TRulesDocument::TElement element;
         element.className = std::string(1, static_cast<char>('A' + choose(5)));
         element.defaultTreatment = treatment();
@@ -76,10 +78,10 @@ TEST(RuleTrace, AgreesWithThePlugInOnRandomRules)
     for (unsigned int seed = 0; seed < 3000; ++seed) {
         SCOPED_TRACE("seed " + std::to_string(seed));
         std::mt19937 random(seed);
-        const TRulesDocument document = MakeRandomDocument(random);
+        const TRulesDocument document = MakeRandomDocument(random, 6);
         TCIMDiffEngine::TRuleset ruleset = MakeRuleset(document, schema);
         const TRuleTrace trace(document, schema);
-        for (const char* name : {"A", "B", "C", "D", "E"}) {
+        for (const char* name : kClasses) {
             const boost::shared_ptr<TCIMDiffEngine::TDiffClassRules> rules = ruleset.getClassRules(name);
             ASSERT_EQ(rules->fDefault, trace.Find(name).byDefault.treatment) << name;
             ASSERT_EQ(rules->fExcludedKeys, trace.Find(name).excludedKeys) << name;
@@ -87,6 +89,73 @@ TEST(RuleTrace, AgreesWithThePlugInOnRandomRules)
                 const auto listed = rules->fProperties.find(property);
                 const TCIMDiffEngine::propType expected = listed == rules->fProperties.end() ? rules->fDefault : listed->second;
                 ASSERT_EQ(expected, trace.Decide(name, property).treatment) << name << "." << property;
+            }
+        }
+    }
+}
+
+TCIMDiffEngine::propType Other(TCIMDiffEngine::propType treatment)
+{
+    return treatment == TCIMDiffEngine::INCLUDE ? TCIMDiffEngine::EXCLUDE : TCIMDiffEngine::INCLUDE;
+}
+
+// The lines of what decides the defaults, found by turning the default of one element after the other into its opposite.
+std::map<std::string, unsigned int> FindDefaultLines(TRulesDocument document, const boost::shared_ptr<ICIMNamespace>& schema)
+{
+    std::map<std::string, unsigned int> lines;
+    TCIMDiffEngine::TRuleset before = MakeRuleset(document, schema);
+    for (TRulesDocument::TElement& element : document.elements) {
+        element.defaultTreatment = Other(element.defaultTreatment);
+        TCIMDiffEngine::TRuleset after = MakeRuleset(document, schema);
+        element.defaultTreatment = Other(element.defaultTreatment);
+        for (const char* name : kClasses) {
+            if (before.getClassRules(name)->fDefault != after.getClassRules(name)->fDefault) {
+                lines[name] = element.line;
+            }
+        }
+    }
+    return lines;
+}
+
+// The same for the listing of one property.
+std::map<std::string, unsigned int> FindListedLines(TRulesDocument document, const std::string& property,
+                                                    const boost::shared_ptr<ICIMNamespace>& schema)
+{
+    std::map<std::string, unsigned int> lines;
+    TCIMDiffEngine::TRuleset before = MakeRuleset(document, schema);
+    for (TRulesDocument::TElement& element : document.elements) {
+        for (TRulesDocument::TListed& listed : element.listed) {
+            listed.treatment = Other(listed.treatment);
+            TCIMDiffEngine::TRuleset after = MakeRuleset(document, schema);
+            listed.treatment = Other(listed.treatment);
+            for (const char* name : kClasses) {
+                const auto& properties = before.getClassRules(name)->fProperties;
+                if (listed.property == property && properties.count(property) != 0 &&
+                    properties.at(property) != after.getClassRules(name)->fProperties.at(property)) {
+                    lines[name] = listed.line;
+                }
+            }
+        }
+    }
+    return lines;
+}
+
+TEST(RuleTrace, WhatDecidesIsWhatMakesADifference)
+{
+    const boost::shared_ptr<TInMemNamespace> schema = MakeSchema();
+    for (unsigned int seed = 0; seed < 150; ++seed) {
+        SCOPED_TRACE("seed " + std::to_string(seed));
+        std::mt19937 random(seed);
+        const TRulesDocument document = MakeRandomDocument(random, 20);
+        const TRuleTrace trace(document, schema);
+        auto defaultLines = FindDefaultLines(document, schema);
+        for (const char* name : kClasses) {
+            ASSERT_EQ(defaultLines[name], trace.Find(name).byDefault.line) << name;
+        }
+        for (const char* property : {"p", "q", "r"}) {
+            auto listedLines = FindListedLines(document, property, schema);
+            for (const char* name : kClasses) {
+                ASSERT_EQ(listedLines[name], trace.Find(name).listed[property].line) << name << "." << property;
             }
         }
     }
@@ -145,9 +214,9 @@ TEST(RuleTrace, AnElementBeforeItsAncestorsIsOverruled)
               WarningsFor({{Element(2, "D"), Element(3, "A")}}));
 }
 
-TEST(RuleTrace, WhatIsNoKeyIsTold)
+TEST(RuleTrace, AnExcludedKeyThatIsNotAKeyGetsAWarning)
 {
-    EXPECT_EQ("2 excluded key p is no key of class A\n", WarningsFor({{Element(2, "A", {"p"})}}));
+    EXPECT_EQ("2 excluded key p is not a key of class A\n", WarningsFor({{Element(2, "A", {"p"})}}));
 }
 
 }  // namespace

@@ -1,0 +1,133 @@
+// The plug-in's parser keeps a stack of states, one for each open element that it has accepted. Each tag first goes to the plug-in;
+// what the stack looks like afterwards says what the plug-in made of it:
+//
+//     start tag    a new state                 accepted
+//                  no new state                ignored, because it is inside "value"
+//                  exception, a new state      its attributes are refused
+//                  exception, no new state     the element is refused
+//     end tag      "value" was on top          the text is a property's name, accepted unless there is an exception
+//                  anything else               nothing to note
+//
+// A tag's name alone says little: inside "value" any start tag is ignored, and any end tag ends the value.
+#include "client/rules/TRulesParser.h"
+
+#include <utility>
+
+#include "host/TZELException.h"
+#include "spec/TDiffClassRules.h"
+
+namespace NORVZEL20 {
+
+namespace {
+
+using TAttributes = std::map<std::string, std::string>;
+
+// How many states the stack has inside an element; the first one stands for the document.
+const std::size_t kInRoot = 2;
+const std::size_t kInClass = 3;
+const std::size_t kInList = 4;
+const std::size_t kInValue = 5;
+
+TRulesFault MakeFault(TRulesFault::EKind kind, const std::string& text = std::string())
+{
+    TRulesFault fault;
+    fault.kind = kind;
+    fault.text = text;
+    return fault;
+}
+
+TRulesFault FindRootFault(const TAttributes& attrs)
+{
+    for (const auto& [name, value] : attrs) {
+        if (name != "version") {
+            return MakeFault(TRulesFault::kUnknownRootAttribute, name);
+        }
+    }
+    return MakeFault(TRulesFault::kUnknownVersion, attrs.at("version"));
+}
+
+// Finds the first fault in the plug-in's order: the attributes by name, then what is missing.
+TRulesFault FindClassFault(const TAttributes& attrs)
+{
+    for (const auto& [name, value] : attrs) {
+        if (name == "default" && value != "include" && value != "exclude") {
+            return MakeFault(TRulesFault::kInvalidDefault, value);
+        }
+        if (name != "default" && name != "excludekeys" && name != "name") {
+            return MakeFault(TRulesFault::kUnknownClassAttribute, name);
+        }
+    }
+    const auto name = attrs.find("name");
+    return MakeFault(name == attrs.end() || name->second.empty() ? TRulesFault::kNoClassName : TRulesFault::kUnknownClass);
+}
+
+}  // namespace
+
+TRulesParser::TRulesParser(boost::shared_ptr<ICIMNamespace> schema) : TDiffXMLParser(std::move(schema)) {}
+
+void TRulesParser::StartElement(const char* name, TAttributes& attrs)
+{
+    const std::size_t depth = fStateStack.size();
+    try {
+        TDiffXMLParser::StartElement(name, attrs);
+    } catch (const TZELException& error) {
+        if (fStateStack.size() == depth) {
+            NoteFault(error.what(), MakeFault(TRulesFault::kUnexpectedElement, name));
+        } else {
+            NoteFault(error.what(), fStateStack.size() == kInRoot ? FindRootFault(attrs) : FindClassFault(attrs));
+        }
+        throw;
+    }
+    if (fStateStack.size() > depth) {
+        NoteStart(name);
+    }
+}
+
+void TRulesParser::EndElement(const char* name)
+{
+    const bool isValue = fStateStack.size() == kInValue;
+    const std::string text = isValue ? fCharData : std::string();  // before the plug-in clears it
+    try {
+        TDiffXMLParser::EndElement(name);
+    } catch (const TZELException& error) {
+        NoteFault(error.what(), MakeFault(TRulesFault::kUnknownProperty, text));
+        throw;
+    }
+    if (isValue) {
+        fDocument.elements.back().listed.push_back({text, fTreatment, GetCurLine()});
+    }
+}
+
+// Called by the plug-in's states, whose callers above know better what is wrong, and for malformed XML, which nobody knows better.
+void TRulesParser::FatalError(const char* message)
+{
+    fFault = MakeFault(TRulesFault::kMalformed, message);
+    fFault.line = GetCurLine();
+    TDiffXMLParser::FatalError(message);
+}
+
+void TRulesParser::NoteStart(const std::string& name)
+{
+    if (fStateStack.size() == kInClass) {
+        fDocument.elements.push_back(
+            {fCurrentRules->fClassName, fCurrentRules->fDefault, fCurrentRules->fExcludedKeys, GetCurLine(), {}});
+    } else if (fStateStack.size() == kInList) {
+        fTreatment = name == "includelist" ? TCIMDiffEngine::INCLUDE : TCIMDiffEngine::EXCLUDE;
+    }
+}
+
+void TRulesParser::NoteFault(const char* reason, const TRulesFault& fault)
+{
+    // Whatever does not come from FatalError comes from the schema.
+    if (fFault.kind == TRulesFault::kSchemaFailed) {
+        fFault.text = reason;
+        return;
+    }
+    fFault.kind = fault.kind;
+    fFault.text = fault.text;
+    if (fStateStack.size() >= kInClass) {
+        fFault.className = fCurrentRules->fClassName;
+    }
+}
+
+}  // namespace NORVZEL20
