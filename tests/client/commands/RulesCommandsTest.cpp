@@ -1,3 +1,5 @@
+#include <algorithm>
+
 #include "tests/client/TClientFixture.h"
 
 namespace NORVZEL20 {
@@ -125,6 +127,89 @@ TEST_F(RulesCommandsTest, ExplainKnowsWhatIsNeverCompared)
     EXPECT_EQ("KALMO_OperatingSystem.DateTimeOfCollection: not compared, the time of collection never is where the default is to "
               "include\n",
               Result({"explain", "KALMO_OperatingSystem.DateTimeOfCollection", "--spec", rules, "--schema", "web01.xml"}));
+}
+
+/// The plug-in ignores start tags inside "value".
+TEST_F(RulesCommandsTest, ElementsInAValueAreNotListed)
+{
+    const std::string rules =
+        Scratch("nested", "<DifftoolSpec><class name='INV_Disk'><includelist><value>Model<class name='INV_Package'/></value>"
+                          "</includelist></class></DifftoolSpec>");
+    EXPECT_EQ("R: 1 element, 0 warnings\n"
+              "\n"
+              "Elements:\n"
+              "  line 1: class INV_Disk, default exclude\n"
+              "    line 1: include Model\n"
+              "\n"
+              "Effective rules (classes with instances in web01.xml, or with an element):\n"
+              "  KALMO_OperatingSystem: not compared\n"
+              "  INV_Package: not compared\n"
+              "  INV_Disk: 1 of 4 properties compared, all but Device, BootId, SizeMB\n"
+              "  INV_Service: not compared\n",
+              Shorten(Result({"check", rules, "--schema", "web01.xml"}), rules, "R"));
+    EXPECT_EQ("INV_Disk.Model: compared, included by the list at R:1 (element for class INV_Disk)\n",
+              Shorten(Result({"explain", "INV_Disk.Model", "--spec", rules, "--schema", "web01.xml"}), rules, "R"));
+    EXPECT_EQ("INV_Package.Version: not compared, by default, since no element is for this class or one above it\n",
+              Result({"explain", "INV_Package.Version", "--spec", rules, "--schema", "web01.xml"}));
+}
+
+/// An ending value takes the text before the inner element; what follows belongs to nothing.
+TEST_F(RulesCommandsTest, TextBehindAnElementInAValueIsIgnored)
+{
+    const std::string rules = Scratch("split", "<DifftoolSpec><class name='INV_Disk'><includelist><value>Mo<b>del</b>x</value>"
+                                               "</includelist></class></DifftoolSpec>");
+    EXPECT_EQ("INV_Disk.Model: compared, included by the list at R:1 (element for class INV_Disk)\n",
+              Shorten(Result({"explain", "INV_Disk.Model", "--spec", rules, "--schema", "web01.xml"}), rules, "R"));
+}
+
+TEST_F(RulesCommandsTest, OrderCountsWithinALineToo)
+{
+    const std::string rules = Scratch("line", "<DifftoolSpec><class name='INV_Service' default='include'/>"
+                                              "<class name='INV_Element' default='exclude'/></DifftoolSpec>");
+    const std::string listing = Shorten(Result({"check", rules, "--schema", "web01.xml"}), rules, "R");
+    EXPECT_EQ(
+        "Warnings:\n"
+        "  R:1: the element for class INV_Service is read before that of its ancestor INV_Element (line 1), whose default and "
+        "lists replace its own; put the ancestor first\n",
+        listing.substr(std::min(listing.size(), listing.find("Warnings:"))));
+}
+
+TEST_F(RulesCommandsTest, AnElementWithoutEffectOverrulesNothing)
+{
+    const std::string rules = Scratch("third", "<DifftoolSpec>\n<class name='INV_Service'/>\n<class name='INV_Element'/>\n"
+                                               "<class name='INV_Element'/>\n<class name='INV_Element'/>\n</DifftoolSpec>");
+    const std::string listing = Shorten(Result({"check", rules, "--schema", "web01.xml"}), rules, "R");
+    EXPECT_EQ(
+        "Warnings:\n"
+        "  R:2: the element for class INV_Service is read before that of its ancestor INV_Element (line 3), whose default and "
+        "lists replace its own; put the ancestor first\n"
+        "  R:2: the element for class INV_Service is read before that of its ancestor INV_Element (line 4), whose default and "
+        "lists replace its own; put the ancestor first\n"
+        "  R:5: this element for class INV_Element has no effect: the class's rules were complete before it (its first element "
+        "is at line 3); put everything into one element\n",
+        listing.substr(std::min(listing.size(), listing.find("Warnings:"))));
+}
+
+TEST_F(RulesCommandsTest, TheRootClassStandsForAllClasses)
+{
+    const std::string rules =
+        Scratch("root", "<DifftoolSpec><class name='&lt;root&gt;' default='include' excludekeys='BootId'/></DifftoolSpec>");
+    EXPECT_EQ("R: 1 element, 1 warning\n"
+              "\n"
+              "Elements:\n"
+              "  line 1: class <root>, default include, excludekeys BootId\n"
+              "\n"
+              "Effective rules (classes with instances in web01.xml, or with an element):\n"
+              "  KALMO_OperatingSystem: 2 of 3 properties compared, all but DateTimeOfCollection; matched without BootId\n"
+              "  INV_Package: 5 of 5 properties compared; matched without BootId\n"
+              "  INV_Disk: 4 of 4 properties compared; matched without BootId\n"
+              "  INV_Service: 3 of 3 properties compared; matched without BootId\n"
+              "\n"
+              "Warnings:\n"
+              "  R:1: excluded key BootId is not a key of class <root>\n",
+              Shorten(Result({"check", rules, "--schema", "web01.xml"}), rules, "R"));
+    EXPECT_EQ("INV_Disk.Model: compared, by default, R:1 (element for class <root>)\n",
+              Shorten(Result({"explain", "INV_Disk.Model", "--spec", rules, "--schema", "web01.xml"}), rules, "R"));
 }
 
 TEST_F(RulesCommandsTest, WhatIsNotDeclaredCannotBeExplained)
