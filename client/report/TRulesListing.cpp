@@ -1,3 +1,13 @@
+// A listing puts three sources side by side and adds nothing of its own:
+//
+//     what the file says                      the document, element by element
+//     what follows from it                    the plug-in's answers: which properties it compares, which keys it leaves out
+//     which line decides, and what is odd     the trace
+//
+// Whether a property is compared is always the plug-in's answer; the trace only names the reason. In one case no rule is the
+// reason: the plug-in never compares the time of collection if the default is include.
+//
+// Names come from files and may hold anything, so each line is escaped as a whole.
 #include "client/report/TRulesListing.h"
 
 #include <algorithm>
@@ -35,10 +45,10 @@ std::vector<std::string> PropertyNames(const TInMemClass& cls)
 
 std::size_t CountWithSubclasses(TInMemNamespace& ns, const std::string& className)
 {
-    // Not FindClass, which does not know the root class.
-    const auto& cls = dynamic_cast<const TInMemClass&>(*ns.GetClass(className, TCallContext()));
-    std::size_t count = cls.GetInstanceCount();
-    for (const boost::shared_ptr<TInMemClass>& below : cls.GetClassesBelow()) {
+    // FindClass does not find the root class, which rules may name.
+    const auto cls = boost::dynamic_pointer_cast<TInMemClass>(ns.GetClass(className, TCallContext()));
+    std::size_t count = cls->GetInstanceCount();
+    for (const boost::shared_ptr<TInMemClass>& below : cls->GetClassesBelow()) {
         count += below->GetInstanceCount();
     }
     return count;
@@ -53,7 +63,7 @@ TRulesListing::TRulesListing(const std::string& file, const TInventory& schema)
 std::string TRulesListing::WriteCheck()
 {
     fOut.clear();
-    Line(fFile + ": " + Counted(fDocument.elements.size(), "element") + ", " + Counted(fTrace.GetWarnings().size(), "warning"));
+    AddLine(fFile + ": " + Counted(fDocument.elements.size(), "element") + ", " + Counted(fTrace.GetWarnings().size(), "warning"));
     WriteElements();
     WriteEffective();
     WriteUnmatched();
@@ -63,22 +73,22 @@ std::string TRulesListing::WriteCheck()
 
 void TRulesListing::WriteElements()
 {
-    Line("");
-    Line("Elements:");
+    AddLine("");
+    AddLine("Elements:");
     for (const TRulesDocument::TElement& element : fDocument.elements) {
-        Line("  line " + std::to_string(element.line) + ": class " + element.className + ", default " +
-             Verb(element.defaultTreatment) +
-             (element.excludedKeys.empty() ? "" : ", excludekeys " + boost::algorithm::join(element.excludedKeys, " ")));
+        AddLine("  line " + std::to_string(element.line) + ": class " + element.className + ", default " +
+                Verb(element.defaultTreatment) +
+                (element.excludedKeys.empty() ? "" : ", excludekeys " + boost::algorithm::join(element.excludedKeys, " ")));
         for (const TRulesDocument::TListed& listed : element.listed) {
-            Line("    line " + std::to_string(listed.line) + ": " + Verb(listed.treatment) + " " + listed.property);
+            AddLine("    line " + std::to_string(listed.line) + ": " + Verb(listed.treatment) + " " + listed.property);
         }
     }
 }
 
 void TRulesListing::WriteEffective()
 {
-    Line("");
-    Line("Effective rules (classes with instances in " + fSchema.path + ", or with an element):");
+    AddLine("");
+    AddLine("Effective rules (classes with instances in " + fSchema.path + ", or with an element):");
     for (const boost::shared_ptr<TInMemClass>& cls : fSchema.ns->GetClasses()) {
         if (cls->GetInstanceCount() > 0 || HasElement(cls->GetName())) {
             WriteEffective(cls);
@@ -90,7 +100,7 @@ void TRulesListing::WriteEffective(const boost::shared_ptr<TInMemClass>& cls)
 {
     const std::vector<std::string> compared = fRules.PropertiesOf(cls);
     if (compared.empty()) {
-        Line("  " + cls->GetName() + ": not compared");
+        AddLine("  " + cls->GetName() + ": not compared");
         return;
     }
     std::vector<std::string> leftOut;
@@ -98,10 +108,10 @@ void TRulesListing::WriteEffective(const boost::shared_ptr<TInMemClass>& cls)
     std::copy_if(all.begin(), all.end(), std::back_inserter(leftOut),
                  [&compared](const std::string& name) { return !Contains(compared, name); });
     const std::vector<std::string>& keys = fRules.ExcludedKeysOf(cls->GetName());
-    Line("  " + cls->GetName() + ": " + std::to_string(all.size() - leftOut.size()) + " of " +
-         Counted(all.size(), "property", "properties") + " compared" +
-         (leftOut.empty() ? "" : ", all but " + boost::algorithm::join(leftOut, ", ")) +
-         (keys.empty() ? "" : "; matched without " + boost::algorithm::join(keys, ", ")));
+    AddLine("  " + cls->GetName() + ": " + std::to_string(all.size() - leftOut.size()) + " of " +
+            Counted(all.size(), "property", "properties") + " compared" +
+            (leftOut.empty() ? "" : ", all but " + boost::algorithm::join(leftOut, ", ")) +
+            (keys.empty() ? "" : "; matched without " + boost::algorithm::join(keys, ", ")));
 }
 
 void TRulesListing::WriteUnmatched()
@@ -125,10 +135,10 @@ void TRulesListing::WriteWarnings()
     if (fTrace.GetWarnings().empty()) {
         return;
     }
-    Line("");
-    Line("Warnings:");
+    AddLine("");
+    AddLine("Warnings:");
     for (const TRuleTrace::TWarning& warning : fTrace.GetWarnings()) {
-        Line("  " + fFile + ":" + std::to_string(warning.line) + ": " + warning.text);
+        AddLine("  " + fFile + ":" + std::to_string(warning.line) + ": " + warning.text);
     }
 }
 
@@ -138,14 +148,14 @@ std::string TRulesListing::WriteExplanation(const std::string& className)
     const boost::shared_ptr<TInMemClass> cls = RequireClass(className);
     const std::vector<std::string> compared = fRules.PropertiesOf(cls);
     const std::vector<std::string>& keys = fRules.ExcludedKeysOf(cls->GetName());
-    Line(cls->GetName() + ": " + (compared.empty() ? "not compared" : "compared") + "; default " +
-         Verb(fTrace.Find(cls->GetName()).byDefault.treatment) + ", " + Origin(fTrace.Find(cls->GetName()).byDefault));
+    AddLine(cls->GetName() + ": " + (compared.empty() ? "not compared" : "compared") + "; default " +
+            Verb(fTrace.Find(cls->GetName()).byDefault.treatment) + ", " + Origin(fTrace.Find(cls->GetName()).byDefault));
     if (!keys.empty()) {
-        Line("  matched without " + boost::algorithm::join(keys, ", ") + " (excludekeys, " + fFile + ":" +
-             std::to_string(fTrace.Find(cls->GetName()).excludedKeysLine) + ")");
+        AddLine("  matched without " + boost::algorithm::join(keys, ", ") + " (excludekeys, " + fFile + ":" +
+                std::to_string(fTrace.Find(cls->GetName()).excludedKeysLine) + ")");
     }
     for (const std::string& property : PropertyNames(*cls)) {
-        Line("  " + Verdict(*cls, property, compared));
+        AddLine("  " + Verdict(*cls, property, compared));
     }
     return fOut;
 }
@@ -159,7 +169,7 @@ std::string TRulesListing::WriteExplanation(const std::string& className, const 
         throw TClientError(fSchema.path + ": class " + cls->GetName() + " has no property " + EscapeForDisplay(property) +
                            "; cimdelta explain " + cls->GetName() + " lists those it has");
     }
-    Line(cls->GetName() + "." + Verdict(*cls, decl->GetName(), fRules.PropertiesOf(cls)));
+    AddLine(cls->GetName() + "." + Verdict(*cls, decl->GetName(), fRules.PropertiesOf(cls)));
     return fOut;
 }
 
@@ -204,7 +214,7 @@ std::string TRulesListing::Origin(const TRuleTrace::TDecision& decision) const
                : fFile + ":" + std::to_string(decision.line) + " (element for class " + decision.fromClass + ")";
 }
 
-void TRulesListing::Line(const std::string& text)
+void TRulesListing::AddLine(const std::string& text)
 {
     fOut += EscapeForDisplay(text) + "\n";
 }

@@ -10,7 +10,7 @@
 
 namespace NORVZEL20 {
 
-/// What `check` and `explain` tell about a rules file.
+/// What `check` and `explain` report about a rules file.
 class TRulesListing {
   public:
     /// Reads the rules; `schema` must outlive this. Errors: TClientError for a file that the plug-in does not accept.
@@ -18,13 +18,13 @@ class TRulesListing {
     TRulesListing(const TRulesListing&) = delete;
     TRulesListing& operator=(const TRulesListing&) = delete;
 
-    /// The elements with their lines, the effective rules of every class that has instances or that an element is for, what matched
-    /// nothing, and warnings.
+    /// The elements with their lines, what follows from them for each class that has instances or an element, the elements whose
+    /// classes have no instances, and warnings.
     std::string WriteCheck();
 
-    /// How a class is treated, property by property. Errors: TClientError where it is not declared.
+    /// How a class is treated, property by property. Errors: TClientError if it is not declared.
     std::string WriteExplanation(const std::string& className);
-    /// How one property is treated. Errors: TClientError where class or property is not declared.
+    /// How one property is treated. Errors: TClientError if the class or the property is not declared.
     std::string WriteExplanation(const std::string& className, const std::string& property);
 
   private:
@@ -38,7 +38,7 @@ class TRulesListing {
     std::string Verdict(const TInMemClass& cls, const std::string& property, const std::vector<std::string>& compared) const;
     std::string Reason(const TInMemClass& cls, const std::string& property, bool isCompared) const;
     std::string Origin(const TRuleTrace::TDecision& decision) const;
-    void Line(const std::string& text);
+    void AddLine(const std::string& text);
 
     const std::string fFile;
     const TInventory& fSchema;
