@@ -23,7 +23,8 @@ namespace {
 
 const char kInventoryHelp[] = "CIM-XML, plain or compressed with gzip, xz or zstd; - is standard input";
 
-// Put in front of arguments in brackets, which would be taken for a list and split, until they have got where they belong.
+// CLI11 takes an argument in brackets, such as the file name [a,b], for a list and splits it. It leaves an argument alone that
+// begins with this character; Unguard removes the character before anything else sees the argument.
 const char kGuard = '\x01';
 
 std::string Guard(const std::string& argument)
@@ -50,7 +51,7 @@ std::string RefuseEmpty(const std::string& text)
     return text.empty() ? "must not be empty" : "";
 }
 
-// The arguments of every command and which one was asked for.
+// Declares the arguments of every command, parses a command line and runs the command that it names.
 class TCommandLine {
   public:
     TCommandLine()
@@ -58,7 +59,7 @@ class TCommandLine {
         fApp.set_version_flag("--version", std::string("cimdelta ") + CIMDELTA_VERSION);
         fApp.require_subcommand(1);
         fApp.footer("Exit status: 0 for success (compare: no differences), 1 for differences, 2 for trouble.\n"
-                    "cimdelta COMMAND --help tells about one command.");
+                    "cimdelta COMMAND --help describes one command.");
         AddCompare();
         AddCheck();
         AddExplain();
@@ -73,7 +74,7 @@ class TCommandLine {
             guarded.push_back(Guard(argv[i]));
         }
         try {
-            fApp.parse(std::move(guarded));  // the last one first
+            fApp.parse(std::move(guarded));  // CLI11 wants the last argument first
         } catch (const CLI::ParseError& error) {
             return Answer(error, console);
         }
@@ -81,7 +82,7 @@ class TCommandLine {
     }
 
   private:
-    // --help and --version are results; everything else is wrong usage.
+    // Ends a run without a command: --help and --version are results, everything else is wrong usage.
     int Answer(const CLI::ParseError& error, IConsole& console)
     {
         std::ostringstream out;
@@ -115,7 +116,7 @@ class TCommandLine {
     static void AddFormat(CLI::App* command, EOutputFormat& format)
     {
         const std::function<void(const std::string&)> set = [&format](const std::string& name) { format = OutputFormatOf(name); };
-        command->add_option_function("-o,--format", set, Alternatives(OutputFormatNames()) + " (text)")
+        command->add_option_function("-o,--format", set, Alternatives(OutputFormatNames()) + " (default: text)")
             ->transform(&Unguard)
             ->check(&RefuseEmpty)
             ->check(CLI::IsMember(OutputFormatNames()))
@@ -129,7 +130,8 @@ class TCommandLine {
 
     static void AddSchemas(CLI::App* command, std::vector<std::string>& schemas)
     {
-        AddText(command, "--schema", schemas, "an inventory to be compared under the rules; repeated for each, the reference first")
+        AddText(command, "--schema", schemas,
+                "an inventory that the rules are for; repeat the option for several, the reference first")
             ->required()
             ->allow_extra_args(false)
             ->option_text("INVENTORY");
@@ -137,19 +139,21 @@ class TCommandLine {
 
     void AddCompare()
     {
-        CLI::App* command = AddCommand("compare", "what differs between a reference and other inventories",
+        CLI::App* command = AddCommand("compare", "show what differs between a reference and other inventories",
                                        [this](IConsole& console) { return RunCompare(fCompare, console); });
         AddText(command, "REFERENCE", fCompare.reference, kInventoryHelp)->required()->option_text(" ");
-        AddText(command, "OTHER", fCompare.others, "compared with the reference, each")->required()->option_text("...");
-        AddText(command, "--spec", fCompare.rules, "the rules: what to compare (everything)")->option_text("RULES");
+        AddText(command, "OTHER", fCompare.others, "the inventories to compare with the reference")->required()->option_text("...");
+        AddText(command, "--spec", fCompare.rules, "a rules file that says what to compare (default: everything)")
+            ->option_text("RULES");
         AddFormat(command, fCompare.format);
         AddOutput(command, fCompare.output);
-        command->add_flag("--strict-schema", fCompare.strictSchema, "declare nothing in inventories that lack what others declare");
+        command->add_flag("--strict-schema", fCompare.strictSchema,
+                          "take each inventory as it is: do not add declarations that only others have");
     }
 
     void AddCheck()
     {
-        CLI::App* command = AddCommand("check", "what a rules file says and does, and what is odd about it",
+        CLI::App* command = AddCommand("check", "show what a rules file says, what follows from it and what may be a mistake",
                                        [this](IConsole& console) { return RunCheck(fCheck, console); });
         AddText(command, "RULES", fCheck.rules, "the rules file")->required()->option_text(" ");
         AddSchemas(command, fCheck.schemas);
@@ -158,7 +162,7 @@ class TCommandLine {
 
     void AddExplain()
     {
-        CLI::App* command = AddCommand("explain", "which rule decides how a class or a property is compared",
+        CLI::App* command = AddCommand("explain", "show which rule decides how a class or a property is compared",
                                        [this](IConsole& console) { return RunExplain(fExplain, console); });
         AddText(command, "ELEMENT", fExplain.element, "CLASS or CLASS.PROPERTY")->required()->option_text(" ");
         AddText(command, "--spec", fExplain.rules, "the rules file")->required()->option_text("RULES");
@@ -168,7 +172,7 @@ class TCommandLine {
 
     void AddQuery()
     {
-        CLI::App* command = AddCommand("query", "the instances of an inventory that answer a query",
+        CLI::App* command = AddCommand("query", "show the instances of an inventory that match a query",
                                        [this](IConsole& console) { return RunQuery(fQuery, console); });
         AddText(command, "QUERY", fQuery.query, "WQL: SELECT * | name, ... FROM class [WHERE ...]")->required()->option_text(" ");
         AddText(command, "INVENTORY", fQuery.inventory, kInventoryHelp)->required()->option_text(" ");
@@ -178,15 +182,16 @@ class TCommandLine {
 
     void AddShow()
     {
-        CLI::App* command = AddCommand("show", "the classes of an inventory, or the instances of a class",
+        CLI::App* command = AddCommand("show", "show the classes of an inventory, or the instances of a class",
                                        [this](IConsole& console) { return RunShow(fShow, console); });
         AddText(command, "INVENTORY", fShow.inventory, kInventoryHelp)->required()->option_text(" ");
-        AddText(command, "CLASS", fShow.className, "its instances, and those of the classes below it")->option_text(" ");
+        AddText(command, "CLASS", fShow.className, "show the instances of this class and of the classes below it")
+            ->option_text(" ");
         AddFormat(command, fShow.format);
         AddOutput(command, fShow.output);
     }
 
-    CLI::App fApp{"Compares inventories held as CIM-XML and tells what differs.", "cimdelta"};
+    CLI::App fApp{"Compares inventories held as CIM-XML and reports what differs.", "cimdelta"};
     std::function<int(IConsole&)> fCommand;
     TCompareOptions fCompare;
     TCheckOptions fCheck;
@@ -199,7 +204,7 @@ class TCommandLine {
 
 namespace {
 
-// A text that there is no memory to put together gives way to the reason.
+// If there is no memory to build the message, says that instead.
 void Complain(IConsole& console, const char* text) noexcept
 {
     try {
@@ -216,7 +221,7 @@ int RunClient(int argc, const char* const* argv, IConsole& console) noexcept
     try {
         return TCommandLine().Run(argc, argv, console);
     } catch (const TReaderGone&) {
-        // Nobody waits for a message either.
+        // The reader of the result has closed the pipe; a message would only disturb.
     } catch (const std::bad_alloc&) {
         console.Say(kNoMemory);
     } catch (const std::exception& error) {

@@ -6,8 +6,9 @@ namespace NORVZEL20 {
 
 /// The whole program: reads the arguments (the first is the program's name), runs the command and returns the exit status.
 ///
-/// 0 for success (for compare: no differences), 1 for differences, 2 for any trouble, wrong usage included: then one message has
-/// been said and no result written. Never throws.
+/// kExitSuccess (0); for compare, this means no differences. kExitDifferences (1) for compare alone. kExitTrouble (2) for anything
+/// else, wrong usage included: nothing has been written then but one message, or no message if the reader has closed the pipe.
+/// Never throws.
 int RunClient(int argc, const char* const* argv, IConsole& console) noexcept;
 
 }  // namespace NORVZEL20

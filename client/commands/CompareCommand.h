@@ -8,7 +8,7 @@
 
 namespace NORVZEL20 {
 
-/// What `cimdelta compare` was asked.
+/// The arguments of `cimdelta compare`.
 struct TCompareOptions {
     std::string reference;
     std::vector<std::string> others;  ///< at least one
@@ -18,7 +18,8 @@ struct TCompareOptions {
     bool strictSchema = false;
 };
 
-/// Compares inventories. Returns 0 for no differences, 1 for differences. Errors: TClientError; nothing has been written then.
+/// Compares inventories. Returns kExitSuccess (0) for no differences, otherwise kExitDifferences (1). Errors: TClientError; no
+/// result has been written then.
 int RunCompare(const TCompareOptions& options, IConsole& console);
 
 }  // namespace NORVZEL20

@@ -7,7 +7,7 @@
 
 namespace NORVZEL20 {
 
-/// What `cimdelta explain` was asked.
+/// The arguments of `cimdelta explain`.
 struct TExplainOptions {
     std::string element;  ///< a class, or a class and a property with a dot between them
     std::string rules;
@@ -15,7 +15,7 @@ struct TExplainOptions {
     std::string output;                ///< empty: standard output
 };
 
-/// Tells which rule decides how a class or a property is treated. Returns 0. Errors: TClientError.
+/// Writes which rule decides how a class or a property is treated. Returns kExitSuccess (0). Errors: TClientError.
 int RunExplain(const TExplainOptions& options, IConsole& console);
 
 }  // namespace NORVZEL20

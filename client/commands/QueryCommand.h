@@ -7,7 +7,7 @@
 
 namespace NORVZEL20 {
 
-/// What `cimdelta query` was asked.
+/// The arguments of `cimdelta query`.
 struct TQueryOptions {
     std::string query;
     std::string inventory;
@@ -15,7 +15,7 @@ struct TQueryOptions {
     std::string output;  ///< empty: standard output
 };
 
-/// Writes the instances of an inventory that answer a query in WQL. Returns 0. Errors: TClientError.
+/// Writes the instances of an inventory that match a query in WQL. Returns kExitSuccess (0). Errors: TClientError.
 int RunQuery(const TQueryOptions& options, IConsole& console);
 
 }  // namespace NORVZEL20

@@ -7,7 +7,7 @@
 
 namespace NORVZEL20 {
 
-/// What `cimdelta show` was asked.
+/// The arguments of `cimdelta show`.
 struct TShowOptions {
     std::string inventory;
     std::string className;  ///< empty: the classes are listed
@@ -15,7 +15,8 @@ struct TShowOptions {
     std::string output;  ///< empty: standard output
 };
 
-/// Writes what an inventory holds: its classes, or the instances of one class and those below it. Returns 0. Errors: TClientError.
+/// Writes what an inventory holds: its classes, or the instances of one class and those below it. Returns kExitSuccess (0).
+/// Errors: TClientError.
 int RunShow(const TShowOptions& options, IConsole& console);
 
 }  // namespace NORVZEL20

@@ -201,7 +201,7 @@ std::string TRulesListing::Reason(const TInMemClass& cls, const std::string& pro
 {
     const TRuleTrace::TDecision decision = fTrace.Decide(cls.GetName(), property);
     if (!isCompared && decision.treatment == TCIMDiffEngine::INCLUDE && property == kCollectionTime) {
-        return "the time of collection never is where the default is to include";
+        return "because the time of collection is never compared if the default is include";
     }
     return decision.isListed ? std::string(Verb(decision.treatment)) + "d by the list at " + Origin(decision)
                              : std::string("by default, ") + Origin(decision);

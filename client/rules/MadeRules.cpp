@@ -36,7 +36,7 @@ std::string MakeRulesForEverything(const TInventory& reference, const std::vecto
     }
     if (IsMade(notes)) {
         const boost::shared_ptr<TInMemClass> made = reference.ns->FindClass(kOperatingSystemClass);
-        // Top-level, it has an element already: this second one prevails. Below another class it prevails over that one's.
+        // The class already has rules: from the loop above, or from the element of a class above it. This element replaces them.
         rules += Element(made->GetName(), "exclude");
         for (const boost::shared_ptr<ICIMClass>& cls : SubclassesOf(*made)) {
             rules += Element(cls->GetName(TCallContext()), "include");

@@ -8,8 +8,8 @@
 
 namespace NORVZEL20 {
 
-/// A rules file's text that compares every class of the reference in every property, save a KALMO_OperatingSystem that the client
-/// itself made.
+/// The text of a rules file that compares every property of every class of the reference, except a KALMO_OperatingSystem that the
+/// client itself made.
 std::string MakeRulesForEverything(const TInventory& reference, const std::vector<TSchemaNote>& notes);
 
 }  // namespace NORVZEL20

@@ -7,9 +7,10 @@
 
 namespace NORVZEL20 {
 
-/// Takes the core log's entries while it lives, so that a person is told once, in the client's words, what the log tells twice.
+/// Keeps the core log's entries to itself while it lives. The client reports a failure once and in its own words; the log would
+/// report it again, often twice.
 ///
-/// One at a time in a process, and not while another thread may be writing to the log.
+/// Use one at a time in a process, and only while no other thread writes to the log.
 class TLogCapture : public ILogger {
   public:
     TLogCapture();

@@ -120,7 +120,7 @@ void TRuleTrace::CheckNames(std::size_t index)
     if (declared != element.className) {
         Warn(index, element.line,
              "class " + element.className + " is declared as " + declared +
-                 "; letter case counts in rules, so this element reaches no class of that name");
+                 "; letter case counts in rules, so this element does not apply to that class");
     }
     std::set<std::string> seen;
     for (const TRulesDocument::TListed& listed : element.listed) {
@@ -133,7 +133,7 @@ void TRuleTrace::CheckNames(std::size_t index)
         if (!seen.insert(listed.property).second) {
             Warn(index, listed.line,
                  "property " + listed.property + " of class " + element.className +
-                     " is listed before in this element; the first listing counts");
+                     " is already listed in this element; the first listing counts");
         }
     }
     CheckKeys(index, *cls);

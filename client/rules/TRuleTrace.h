@@ -12,7 +12,7 @@
 
 namespace NORVZEL20 {
 
-/// Which element of a rules file decides what, class by class, and what its author may not have meant.
+/// Which element of a rules file decides what, class by class, and what in the file is probably a mistake.
 class TRuleTrace {
   public:
     /// A treatment and the element that gave it.
@@ -31,7 +31,7 @@ class TRuleTrace {
         unsigned int excludedKeysLine = 0;
     };
 
-    /// Something that is allowed but that the author hardly means.
+    /// Something that is allowed but probably a mistake.
     struct TWarning {
         std::size_t element;  ///< the position of the element that it is about
         unsigned int line;

@@ -22,7 +22,7 @@ const std::size_t kBlockSize = 64 * 1024;
 void CheckFile(const std::string& file)
 {
     struct stat status;
-    // With the marker the plug-in would go without rules, which nobody asks for by naming a file.
+    // With the marker in the name, the plug-in would compare without rules.
     if (file.find(kNoRulesMarker) != std::string::npos) {
         throw TClientError(file + ": a rules file cannot have " + kNoRulesMarker + " in its name; rename it");
     }
@@ -30,7 +30,7 @@ void CheckFile(const std::string& file)
         throw TClientError(file + ": cannot be opened", LastSystemError());
     }
     if (!S_ISREG(status.st_mode)) {
-        throw TClientError(file + ": is no regular file; save the rules to a file and name that");
+        throw TClientError(file + ": is not a regular file; save the rules to a file and name that file");
     }
     if (status.st_size > static_cast<off_t>(kMaxSpecFileSize)) {
         throw TClientError(file + ": is larger than " + std::to_string(kMaxSpecFileSize) +
@@ -40,7 +40,7 @@ void CheckFile(const std::string& file)
 
 std::string ReadWhole(const std::string& path)
 {
-    TInputFile file(path == "-" ? "./-" : path);  // rules never come from standard input
+    TInputFile file(path == "-" ? "./-" : path);  // "-" is a file here, not standard input
     std::string text;
     std::vector<char> block(kBlockSize);
     while (const std::size_t count = file.Read(block.data(), block.size())) {
@@ -57,7 +57,7 @@ TRules::TRules(boost::shared_ptr<ICIMNamespace> schema, const std::string& file,
     CheckFile(file);
     std::string text = ReadWhole(file);
     TRulesParser parser(schema);
-    const TLogCapture log;  // keeps the plug-in's own words from the person, who gets the client's
+    const TLogCapture log;  // the fault says the same in the client's words
     try {
         parser.Parse(text.data(), text.size());
     } catch (const TZELException& error) {

@@ -22,7 +22,7 @@ class TRules {
     TRules(const TRules&) = delete;
     TRules& operator=(const TRules&) = delete;
 
-    /// The properties to compare; empty where the class's instances are not compared.
+    /// The properties to compare; empty if the class's instances are not compared.
     std::vector<std::string> PropertiesOf(const boost::shared_ptr<ICIMClass>& cls);
 
     /// The key under which an instance of class `className` is matched.
@@ -44,7 +44,7 @@ class TRules {
     TCIMDiffEngine fEngine;
     TCIMDiffEngine::TRuleset fRuleset;
     TRulesDocument fDocument;
-    std::string fFoundName;  // the class looked up last: instances come class by class
+    std::string fFoundName;  // the class looked up last; instances come class by class
     boost::shared_ptr<TCIMDiffEngine::TDiffClassRules> fFound;
 };
 

@@ -98,7 +98,7 @@ void TRulesParser::EndElement(const char* name)
     }
 }
 
-// Called by the plug-in's states, whose callers above know better what is wrong, and for malformed XML, which nobody knows better.
+// Called for malformed XML, and by the plug-in for whatever it refuses. What it refuses is described better by the callers above.
 void TRulesParser::FatalError(const char* message)
 {
     fFault = MakeFault(TRulesFault::kMalformed, message);

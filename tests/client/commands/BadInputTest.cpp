@@ -49,11 +49,11 @@ TEST_F(BadInputTest, EachUnusableRulesFileGetsOneMessage)
     }
 }
 
-TEST_F(BadInputTest, RulesThatAreNoFileAreToldApart)
+TEST_F(BadInputTest, EachPathThatIsNotARulesFileGetsItsMessage)
 {
     EXPECT_EQ("cimdelta: none.xml: cannot be opened: No such file or directory\n",
               Complaint({"compare", "--spec", "none.xml", "web01.xml", "web02.xml"}));
-    EXPECT_EQ("cimdelta: .: is no regular file; save the rules to a file and name that\n",
+    EXPECT_EQ("cimdelta: .: is not a regular file; save the rules to a file and name that file\n",
               Complaint({"compare", "--spec", ".", "web01.xml", "web02.xml"}));
     EXPECT_EQ("cimdelta: rules.xml|fVMWareEnable: a rules file cannot have |fVMWareEnable in its name; rename it\n",
               Complaint({"compare", "--spec", "rules.xml|fVMWareEnable", "web01.xml", "web02.xml"}));
@@ -76,7 +76,7 @@ TEST_F(BadInputTest, InventoriesThatCannotBeOpenedAreNamed)
     EXPECT_EQ("cimdelta: standard input (-) can be read only once; save it to a file first\n", Complaint({"compare", "-", "-"}));
 }
 
-TEST_F(BadInputTest, OfSeveralBadInventoriesTheFirstIsTold)
+TEST_F(BadInputTest, OfSeveralBadInventoriesTheFirstIsReported)
 {
     for (int i = 0; i < 20; ++i) {
         EXPECT_EQ("cimdelta: none.xml: cannot be opened: No such file or directory\n",
@@ -84,7 +84,7 @@ TEST_F(BadInputTest, OfSeveralBadInventoriesTheFirstIsTold)
     }
 }
 
-TEST_F(BadInputTest, InventoriesThatAreNoInventoriesAreToldWithTheirPlace)
+TEST_F(BadInputTest, InventoriesThatAreNoInventoriesAreReportedWithTheirPlace)
 {
     const struct {
         const char* inventory;
@@ -145,7 +145,7 @@ TEST_F(BadInputTest, ALongKeyMakesNoLongMessage)
               Shorten(Complaint({"show", inventory}), inventory, "I"));
 }
 
-TEST_F(BadInputTest, WrongUsageIsToldInOneLine)
+TEST_F(BadInputTest, WrongUsageIsReportedInOneLine)
 {
     EXPECT_EQ("cimdelta: name a command: compare, check, explain, query or show; see cimdelta --help\n", Complaint({}));
     EXPECT_EQ("cimdelta: OTHER is required; see cimdelta compare --help\n", Complaint({"compare", "web01.xml"}));

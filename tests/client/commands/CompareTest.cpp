@@ -17,7 +17,7 @@ class CompareTest : public TClientFixture {
 const char kMadeForOther[] =
     "cimdelta: other-schema.xml: has no instance of KALMO_OperatingSystem, which a comparison needs; one was made\n";
 
-TEST_F(CompareTest, APairIsToldWithOldAndNewValues)
+TEST_F(CompareTest, APairIsReportedWithOldAndNewValues)
 {
     EXPECT_EQ("8 differences between web01 and web02: 2 instances only in web01, 2 instances only in web02, 4 changed values in 3 "
               "instances\n"
@@ -143,7 +143,7 @@ TEST_F(CompareTest, NoDifferencesIsNotSaidOverWhatRulesLeaveOut)
     EXPECT_EQ(0, fStatus);
 }
 
-TEST_F(CompareTest, RulesThatCompareNothingAreToldAsSuch)
+TEST_F(CompareTest, RulesThatCompareNothingAreReported)
 {
     const std::string rules = Scratch("none", "<DifftoolSpec/>");
     EXPECT_EQ("Nothing was compared between web01 and web02.\n"
@@ -156,7 +156,7 @@ TEST_F(CompareTest, RulesThatCompareNothingAreToldAsSuch)
     EXPECT_EQ(0, fStatus);
 }
 
-TEST_F(CompareTest, InstancesThatShareAKeyAreTold)
+TEST_F(CompareTest, InstancesThatShareAKeyAreReported)
 {
     EXPECT_EQ(
         "5 differences between web02 and two-boots: 3 instances only in web02, 1 instance only in two-boots, 1 changed value in 1 "
@@ -213,7 +213,7 @@ TEST_F(CompareTest, AnOperatingSystemIsMadeAfterTheStandardOne)
     }
 }
 
-TEST_F(CompareTest, AnOperatingSystemIsMadeWhereTheClassHasNoInstance)
+TEST_F(CompareTest, AnOperatingSystemIsMadeIfTheClassHasNoInstance)
 {
     const std::string none = Scratch("none.xml", WithoutLast(ReadFile("empty-classes.xml")));
     Run({"compare", none, "empty-classes.xml"});
@@ -229,7 +229,7 @@ TEST_F(CompareTest, AnInstanceGoneUnderExcludedKeysIsFoundByItsPath)
               Result({"compare", "--spec", "rules.xml", "two-boots.xml", "web02.xml"}).find("INV_Disk\n- Device=\"sdb\"\n\n"));
 }
 
-TEST_F(CompareTest, WhatAnotherInventoryDeclaresIsDeclaredAndTold)
+TEST_F(CompareTest, WhatAnotherInventoryDeclaresIsDeclaredAndReported)
 {
     Run({"compare", "web01.xml", "other-schema.xml"});
     EXPECT_EQ("6 differences between web01 and other-schema: 2 instances only in web01, 2 instances only in other-schema, 2 "
@@ -282,7 +282,7 @@ TEST_F(CompareTest, InventoriesWithoutOperatingSystemAreCompleteAllTheSame)
     EXPECT_EQ(0, fStatus);
 }
 
-TEST_F(CompareTest, TypesAndKeysThatDifferAreToldAndCompared)
+TEST_F(CompareTest, TypesAndKeysThatDifferAreReportedAndCompared)
 {
     EXPECT_EQ("7 differences between web01 and other-types: 4 instances only in web01, 2 instances only in other-types, 1 changed "
               "value in 1 "
@@ -313,7 +313,7 @@ TEST_F(CompareTest, TypesAndKeysThatDifferAreToldAndCompared)
               Result({"compare", "web01.xml", "other-types.xml"}));
 }
 
-TEST_F(CompareTest, WhereTypesDifferRecordsStillNameTheOneOtherInventory)
+TEST_F(CompareTest, IfTypesDifferRecordsStillNameTheOneOtherInventory)
 {
     const std::string records = Scratch("records.xml", Result({"compare", "-o", "cimxml", "web01.xml", "other-types.xml"}));
     EXPECT_EQ(

@@ -36,7 +36,7 @@ TEST_F(ExecutableTest, MessagesMoveNoTerminal)
         << Shell("show " + undeclared);
 }
 
-TEST_F(ExecutableTest, TheStatusTellsWhetherSomethingDiffers)
+TEST_F(ExecutableTest, TheStatusSaysWhetherSomethingDiffers)
 {
     EXPECT_EQ("[0]", Shell("compare web01.xml web01-again.xml").substr(0, 3));
     EXPECT_EQ("[1]", Shell("compare web01.xml web02.xml").substr(0, 3));
@@ -83,7 +83,7 @@ TEST_F(ExecutableTest, AnOutputFileKeepsOwnerAndRights)
     EXPECT_EQ(before.st_gid, after.st_gid);
 }
 
-TEST_F(ExecutableTest, AnOutputFileStaysWhereTroubleComesUp)
+TEST_F(ExecutableTest, AnOutputFileStaysInTrouble)
 {
     const std::string file = Scratch("report", "what was there before");
     EXPECT_EQ("[2]", Shell("compare --output " + file + " web01.xml none.xml").substr(0, 3));
@@ -92,7 +92,7 @@ TEST_F(ExecutableTest, AnOutputFileStaysWhereTroubleComesUp)
               Shell("compare --output /nowhere/report web01.xml web02.xml"));
 }
 
-TEST_F(ExecutableTest, AFullDeviceIsTold)
+TEST_F(ExecutableTest, AFullDeviceIsReported)
 {
     EXPECT_EQ("[2]\n--\ncimdelta: standard output cannot be written: No space left on device\n",
               Shell("show web01.xml > /dev/full"));

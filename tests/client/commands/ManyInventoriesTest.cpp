@@ -37,7 +37,7 @@ TEST_F(ManyInventoriesTest, AreComparedWithFewDescriptors)
     EXPECT_NE(std::string::npos, outcome.find("    Version: 5.1 -> web03: 5.2\n")) << outcome;
 }
 
-TEST_F(ManyInventoriesTest, TheFirstThatCannotBeLoadedIsTold)
+TEST_F(ManyInventoriesTest, TheFirstThatCannotBeLoadedIsReported)
 {
     std::vector<std::string> inventories = Inventories("web01.xml", 50, "none.xml");
     inventories[51] = ".";

@@ -35,7 +35,7 @@ TEST_F(QueryAndShowTest, ValuesKeepTheirTypesInJson)
               Result({"query", "SELECT Size, Depends FROM INV_Package WHERE Name = 'nginx'", "-o", "ndjson", "web01.xml"}));
 }
 
-TEST_F(QueryAndShowTest, AWrongQueryIsToldWithItsColumn)
+TEST_F(QueryAndShowTest, AWrongQueryIsReportedWithItsColumn)
 {
     EXPECT_EQ("cimdelta: query, column 10: expected FROM, found 'FORM'\n",
               Complaint({"query", "SELECT * FORM INV_Disk", "web01.xml"}));

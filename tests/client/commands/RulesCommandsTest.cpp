@@ -7,7 +7,7 @@ namespace {
 
 class RulesCommandsTest : public TClientFixture {};
 
-TEST_F(RulesCommandsTest, CheckTellsElementsAndEffectiveRules)
+TEST_F(RulesCommandsTest, CheckShowsElementsAndEffectiveRules)
 {
     EXPECT_EQ("rules.xml: 2 elements, 0 warnings\n"
               "\n"
@@ -34,11 +34,11 @@ TEST_F(RulesCommandsTest, CheckWarnsOfWhatAnAuthorHardlyMeans)
         "  odd-rules.xml:3: the element for class INV_Service is read before that of its ancestor INV_Element (line 4), whose "
         "default and lists "
         "replace its own; put the ancestor first\n"
-        "  odd-rules.xml:9: class inv_disk is declared as INV_Disk; letter case counts in rules, so this element reaches no class "
-        "of that name\n"
+        "  odd-rules.xml:9: class inv_disk is declared as INV_Disk; letter case counts in rules, so this element does not apply "
+        "to that class\n"
         "  odd-rules.xml:10: excluded key Bootid is not a key of class INV_Disk\n"
         "  odd-rules.xml:13: property size of class INV_Package is declared as Size; letter case counts in rules\n"
-        "  odd-rules.xml:17: property Version of class INV_Package is listed before in this element; the first listing counts\n"
+        "  odd-rules.xml:17: property Version of class INV_Package is already listed in this element; the first listing counts\n"
         "  odd-rules.xml:20: excludekeys of class INV_Package has no effect: the class already has an element at line 11; name the "
         "keys there\n"
         "  odd-rules.xml:21: this element for class INV_Package has no effect: the class's rules were complete before it (its "
@@ -48,7 +48,7 @@ TEST_F(RulesCommandsTest, CheckWarnsOfWhatAnAuthorHardlyMeans)
     EXPECT_EQ(0, fStatus);
 }
 
-TEST_F(RulesCommandsTest, CheckTellsExcludedKeysThatComeTooLate)
+TEST_F(RulesCommandsTest, CheckShowsExcludedKeysThatComeTooLate)
 {
     const std::string rules = Scratch("late", "<DifftoolSpec>\n<class name='INV_Element' default='include'/>\n"
                                               "<class name='INV_Service' default='include' excludekeys='Id'/>\n</DifftoolSpec>");
@@ -60,7 +60,7 @@ TEST_F(RulesCommandsTest, CheckTellsExcludedKeysThatComeTooLate)
               listing.substr(listing.find("Warnings:")));
 }
 
-TEST_F(RulesCommandsTest, CheckTellsRulesThatMatchedNothing)
+TEST_F(RulesCommandsTest, CheckShowsRulesThatMatchedNothing)
 {
     const std::string listing = Result({"check", "rules.xml", "--schema", "empty-classes.xml"});
     EXPECT_EQ("Rules that matched nothing:\n"
@@ -124,8 +124,8 @@ TEST_F(RulesCommandsTest, ExplainFollowsAnIncludedNameInAnotherLetterCase)
 TEST_F(RulesCommandsTest, ExplainKnowsWhatIsNeverCompared)
 {
     const std::string rules = Scratch("os", "<DifftoolSpec><class name='KALMO_OperatingSystem' default='include'/></DifftoolSpec>");
-    EXPECT_EQ("KALMO_OperatingSystem.DateTimeOfCollection: not compared, the time of collection never is where the default is to "
-              "include\n",
+    EXPECT_EQ("KALMO_OperatingSystem.DateTimeOfCollection: not compared, because the time of collection is never compared if the "
+              "default is include\n",
               Result({"explain", "KALMO_OperatingSystem.DateTimeOfCollection", "--spec", rules, "--schema", "web01.xml"}));
 }
 
