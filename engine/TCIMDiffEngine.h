@@ -5,6 +5,7 @@
 #include <string>
 #include <vector>
 
+#include "host/Export.h"
 #include "host/ICIMClass.h"
 #include "host/ICIMInstance.h"
 #include "host/ICIMNamespace.h"
@@ -21,7 +22,7 @@ namespace NORVZEL20 {
 ///
 /// Threads: one; the host's objects are called synchronously.
 /// Errors: TZELException with the statuses named here; exceptions of the host's objects as they are. Nothing is undone.
-class TCIMDiffEngine {
+class CIMDELTA_INTERNAL_EXPORT TCIMDiffEngine {
   public:
     /// How a comparison treats a property.
     enum propType {

@@ -4,6 +4,7 @@
 #include <boost/smart_ptr/shared_ptr.hpp>
 #include <string>
 
+#include "host/Export.h"
 #include "host/ICIMElement.h"
 #include "host/ICIMInstance.h"
 #include "host/ICIMMethodDecl.h"
@@ -25,7 +26,7 @@ class ICIMNamespace;
 /// An implementation that overrides the operations of ICIMNamedElement declares them after RemoveMethodDecl, in the order
 /// AddQualifier, AllocateQualifier (three arguments), AllocateQualifier (with a flavor), GetQualifier(name, context),
 /// GetQualifier(name, bool&, context), EnumerateQualifiers.
-class ICIMClass : public ICIMElement, public ICIMNamedElement {
+class CIMDELTA_EXPORT ICIMClass : public ICIMElement, public ICIMNamedElement {
   public:
     /// Makes an allocated class visible in its namespace.
     /// Errors: kAlreadyExists (12) if the namespace has a class of that name, kNamespaceGone (18).

@@ -1,12 +1,13 @@
 #pragma once
 
+#include "host/Export.h"
 #include "host/TCIMValue.h"
 #include "host/TCallContext.h"
 
 namespace NORVZEL20 {
 
 /// Anything of the model that can be checked for completeness.
-class ICIMElement {
+class CIMDELTA_EXPORT ICIMElement {
   public:
     virtual ~ICIMElement() = default;
 

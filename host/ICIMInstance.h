@@ -4,6 +4,7 @@
 #include <boost/smart_ptr/shared_ptr.hpp>
 #include <string>
 
+#include "host/Export.h"
 #include "host/ICIMElement.h"
 #include "host/ICIMProperty.h"
 #include "host/TCIMReference.h"
@@ -16,7 +17,7 @@ class ICIMClass;
 ///
 /// ICIMClass::AllocateInstance makes it with every property null. Its properties are set through GetProperty, and AddToNamespace
 /// makes it visible.
-class ICIMInstance : public ICIMElement {
+class CIMDELTA_EXPORT ICIMInstance : public ICIMElement {
   public:
     /// Makes the instance part of its class's namespace.
     /// Errors: kAlreadyExists (12) if the namespace has an instance with the same keys, kKeyMissing (14) if a key has no value,

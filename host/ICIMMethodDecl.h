@@ -2,12 +2,13 @@
 
 #include <string>
 
+#include "host/Export.h"
 #include "host/ICIMNamedElement.h"
 
 namespace NORVZEL20 {
 
 /// The declaration of a method in a class.
-class ICIMMethodDecl : public ICIMNamedElement {
+class CIMDELTA_EXPORT ICIMMethodDecl : public ICIMNamedElement {
   public:
     /// The name as declared. Valid while the declaration lives.
     virtual const std::string& GetName(TCallContext context) const = 0;

@@ -4,6 +4,7 @@
 #include <boost/smart_ptr/shared_ptr.hpp>
 #include <string>
 
+#include "host/Export.h"
 #include "host/ICIMQualifier.h"
 #include "host/ICIMQualifierDecl.h"
 #include "host/TCallContext.h"
@@ -11,7 +12,7 @@
 namespace NORVZEL20 {
 
 /// An element that has qualifiers. The order of the operations is part of the contract.
-class ICIMNamedElement {
+class CIMDELTA_EXPORT ICIMNamedElement {
   public:
     virtual ~ICIMNamedElement() = default;
 

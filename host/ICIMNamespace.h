@@ -4,6 +4,7 @@
 #include <boost/smart_ptr/shared_ptr.hpp>
 #include <string>
 
+#include "host/Export.h"
 #include "host/ICIMClass.h"
 #include "host/ICIMIndicationFilter.h"
 #include "host/ICIMInstance.h"
@@ -19,7 +20,7 @@ namespace NORVZEL20 {
 /// Threads: use a namespace, with all its classes and instances, from one thread at a time; different namespaces may be used
 /// concurrently.
 /// Errors: TZELException throughout; each operation names its statuses.
-class ICIMNamespace {
+class CIMDELTA_EXPORT ICIMNamespace {
   public:
     virtual ~ICIMNamespace() = default;
 

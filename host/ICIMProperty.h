@@ -2,6 +2,7 @@
 
 #include <boost/smart_ptr/shared_ptr.hpp>
 
+#include "host/Export.h"
 #include "host/ICIMPropertyDecl.h"
 #include "host/TCIMValue.h"
 #include "host/TCallContext.h"
@@ -11,7 +12,7 @@ namespace NORVZEL20 {
 /// One property value of an instance, or a static property of a class. The order of the operations is part of the contract.
 ///
 /// A handle keeps its instance alive. Reading allocates nothing.
-class ICIMProperty {
+class CIMDELTA_EXPORT ICIMProperty {
   public:
     virtual ~ICIMProperty() = default;
 

@@ -2,12 +2,13 @@
 
 #include <string>
 
+#include "host/Export.h"
 #include "host/ICIMNamedElement.h"
 
 namespace NORVZEL20 {
 
 /// The declaration of a property in a class.
-class ICIMPropertyDecl : public ICIMNamedElement {
+class CIMDELTA_EXPORT ICIMPropertyDecl : public ICIMNamedElement {
   public:
     /// The name as declared. Valid while the declaration lives.
     virtual const std::string& GetName(TCallContext context) const = 0;

@@ -2,12 +2,13 @@
 
 #include <string>
 
+#include "host/Export.h"
 #include "host/ICIMQualifierDecl.h"
 
 namespace NORVZEL20 {
 
 /// A qualifier: a named value that describes a class, property or method (DSP0004, 5.6 "Qualifiers").
-class ICIMQualifier {
+class CIMDELTA_EXPORT ICIMQualifier {
   public:
     virtual ~ICIMQualifier() = default;
 

@@ -2,13 +2,14 @@
 
 #include <string>
 
+#include "host/Export.h"
 #include "host/TCIMValue.h"
 #include "host/TCallContext.h"
 
 namespace NORVZEL20 {
 
 /// The declaration of a qualifier: its type and default, which elements may have it, and how it is inherited.
-class ICIMQualifierDecl {
+class CIMDELTA_EXPORT ICIMQualifierDecl {
   public:
     /// The elements that may have the qualifier; a set of bits (DSP0004, 5.6.2).
     enum EScope : unsigned int {

@@ -2,10 +2,12 @@
 
 #include <string>
 
+#include "host/Export.h"
+
 namespace NORVZEL20 {
 
 /// The host's log.
-class ILogger {
+class CIMDELTA_EXPORT ILogger {
   public:
     virtual ~ILogger() = default;
 

@@ -3,6 +3,7 @@
 #include <boost/smart_ptr/shared_ptr.hpp>
 #include <string>
 
+#include "host/Export.h"
 #include "host/TCIMValue.h"
 #include "host/TCallContext.h"
 
@@ -12,7 +13,7 @@ class ICIMNamespace;
 
 /// A source of namespaces, registered with the provider manager under its name. The order of the operations is part of the
 /// contract.
-class INamespaceProvider {
+class CIMDELTA_EXPORT INamespaceProvider {
   public:
     virtual ~INamespaceProvider() = default;
 

@@ -2,13 +2,14 @@
 
 #include <boost/smart_ptr/shared_ptr.hpp>
 
+#include "host/Export.h"
 #include "host/INamespaceProvider.h"
 #include "host/TZELStatusCode.h"
 
 namespace NORVZEL20 {
 
 /// The registry of namespace providers. The order of the operations is part of the contract.
-class INamespaceProviderManager {
+class CIMDELTA_EXPORT INamespaceProviderManager {
   public:
     virtual ~INamespaceProviderManager() = default;
 

@@ -1,9 +1,11 @@
 #pragma once
 
+#include "host/Export.h"
+
 namespace NORVZEL20 {
 
 /// An instance provider of a namespace. Only the host that made it knows its contents.
-class IProvider {
+class CIMDELTA_EXPORT IProvider {
   public:
     virtual ~IProvider() = default;
 };

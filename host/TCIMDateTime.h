@@ -4,13 +4,15 @@
 #include <string>
 #include <string_view>
 
+#include "host/Export.h"
+
 namespace NORVZEL20 {
 
 /// A CIM datetime: a point in time with its UTC offset, or an interval (DSP0004, 5.2.4 "Datetime type").
 ///
 /// A field, or a single digit of the microseconds, that is not known is written in asterisks. A value type of 16 bytes; nothing is
 /// allocated.
-class TCIMDateTime {
+class CIMDELTA_EXPORT TCIMDateTime {
   public:
     /// The point in time 1970-01-01 00:00 UTC.
     TCIMDateTime() noexcept = default;

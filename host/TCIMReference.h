@@ -6,6 +6,7 @@
 #include <string>
 #include <utility>
 
+#include "host/Export.h"
 #include "host/TCIMValue.h"
 
 namespace NORVZEL20 {
@@ -18,7 +19,7 @@ class ICIMNamespace;
 /// A value type. Copies share their contents until one of them is changed, so copying allocates nothing. The path holds its class,
 /// but its namespace only weakly, because a namespace may store references into itself. The namespace's name is kept.
 /// Threads: different objects may be used concurrently, even if they share contents.
-class TCIMReference {
+class CIMDELTA_EXPORT TCIMReference {
   public:
     /// A path without namespace, class and keys; its text is empty.
     TCIMReference();

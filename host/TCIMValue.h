@@ -6,6 +6,8 @@
 #include <string_view>
 #include <vector>
 
+#include "host/Export.h"
+
 namespace NORVZEL20 {
 
 class TCIMDateTime;
@@ -19,7 +21,7 @@ class TEmbeddedObject;
 /// Threads: different objects may be used concurrently, even if they share contents.
 /// Errors: constructors that take text or several elements may throw std::bad_alloc; accessors and conversions throw
 /// TZELException with kTypeMismatch (13) if the value is null or of a type that they do not accept.
-class alignas(8) TCIMValue {
+class CIMDELTA_EXPORT alignas(8) TCIMValue {
   public:
     /// The type of a value; converts to and from the bare enumeration.
     class TCIMType {

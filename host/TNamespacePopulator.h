@@ -4,13 +4,14 @@
 #include <string>
 #include <vector>
 
+#include "host/Export.h"
 #include "host/ICIMElement.h"
 #include "host/ICIMNamespace.h"
 
 namespace NORVZEL20 {
 
 /// Loads classes and instances from files.
-class TNamespacePopulator {
+class CIMDELTA_EXPORT TNamespacePopulator {
   public:
     TNamespacePopulator() = delete;
 

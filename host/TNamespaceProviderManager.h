@@ -4,6 +4,7 @@
 #include <string>
 #include <vector>
 
+#include "host/Export.h"
 #include "host/INamespaceProviderManager.h"
 
 namespace NORVZEL20 {
@@ -12,7 +13,7 @@ namespace NORVZEL20 {
 ///
 /// The order of the virtual operations is part of the contract: registration, then look-up.
 /// Threads: any, at any time.
-class TNamespaceProviderManager : public INamespaceProviderManager {
+class CIMDELTA_EXPORT TNamespaceProviderManager : public INamespaceProviderManager {
   public:
     /// Never null.
     static boost::shared_ptr<TNamespaceProviderManager> GetInstance();

@@ -3,10 +3,12 @@
 #include <cstdint>
 #include <string>
 
+#include "host/Export.h"
+
 namespace NORVZEL20 {
 
 /// The parts of the host that depend on the operating system.
-class TOSSpecific {
+class CIMDELTA_EXPORT TOSSpecific {
   public:
     TOSSpecific() = delete;
 

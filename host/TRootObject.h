@@ -2,13 +2,14 @@
 
 #include <boost/smart_ptr/shared_ptr.hpp>
 
+#include "host/Export.h"
 #include "host/ILogger.h"
 #include "host/INamespaceProviderManager.h"
 
 namespace NORVZEL20 {
 
 /// Gives access to the host's services.
-class TRootObject {
+class CIMDELTA_EXPORT TRootObject {
   public:
     TRootObject() = delete;
 

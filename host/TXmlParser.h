@@ -5,6 +5,8 @@
 #include <memory>
 #include <string>
 
+#include "host/Export.h"
+
 namespace NORVZEL20 {
 
 /// An event-driven XML 1.0 parser: derive from it and override the events of interest. The order of the virtual operations is part
@@ -14,7 +16,7 @@ namespace NORVZEL20 {
 /// document may be in UTF-8, UTF-16, ISO-8859-1 or US-ASCII; events carry UTF-8.
 /// An exception thrown by a handler ends the parse; Parse throws it on.
 /// Threads: use a parser from one thread at a time.
-class TXmlParser {
+class CIMDELTA_EXPORT TXmlParser {
   public:
     TXmlParser();
     TXmlParser(const TXmlParser&) = delete;

@@ -2,12 +2,13 @@
 
 #include <exception>
 
+#include "host/Export.h"
 #include "host/TZELStatusCode.h"
 
 namespace NORVZEL20 {
 
 /// The exception that every operation of the object model throws: a status. Throw it by value.
-class TZELException : public std::exception {
+class CIMDELTA_EXPORT TZELException : public std::exception {
   public:
     explicit TZELException(TZELStatusCode status) noexcept;
     TZELException(const TZELException& other) noexcept = default;

@@ -2,10 +2,12 @@
 
 #include <string>
 
+#include "host/Export.h"
+
 namespace NORVZEL20 {
 
 /// A status number of the host.
-class TZELStatusCode {
+class CIMDELTA_EXPORT TZELStatusCode {
   public:
     enum EStatusCode : int {
         kSuccess = 0,

@@ -3,6 +3,7 @@
 #include <boost/function.hpp>
 #include <boost/smart_ptr/shared_ptr.hpp>
 
+#include "host/Export.h"
 #include "host/ICIMClass.h"
 #include "host/ICIMNamespace.h"
 #include "host/TUnaryFunction.h"
@@ -12,7 +13,7 @@ namespace NORVZEL20 {
 /// Turns an enumeration of classes into one of the same-named classes of a namespace.
 ///
 /// The callback is not copied and must outlive the enumeration.
-class TCallbackWrapClass : public TUnaryFunction<boost::shared_ptr<ICIMClass>> {
+class CIMDELTA_INTERNAL_EXPORT TCallbackWrapClass : public TUnaryFunction<boost::shared_ptr<ICIMClass>> {
   public:
     TCallbackWrapClass(boost::shared_ptr<ICIMNamespace> ns, const boost::function<bool(boost::shared_ptr<ICIMClass>)>* callback,
                        const TCallContext& context);

@@ -6,6 +6,7 @@
 #include <map>
 #include <string>
 
+#include "host/Export.h"
 #include "host/ICIMClass.h"
 #include "host/TCIMReference.h"
 
@@ -24,7 +25,7 @@ class TDeltaNamespace;
 /// Threads: as the delta namespace.
 /// Errors: those of the wrapped class and of the delta namespace as they are, beyond those named here. The order of the virtual
 /// operations is part of the contract.
-class TDeltaClass : public ICIMClass, public boost::enable_shared_from_this<TDeltaClass> {
+class CIMDELTA_INTERNAL_EXPORT TDeltaClass : public ICIMClass, public boost::enable_shared_from_this<TDeltaClass> {
   public:
     TDeltaClass(boost::shared_ptr<TDeltaNamespace> deltaNamespace, boost::shared_ptr<ICIMClass> cls);
     TDeltaClass(const TDeltaClass&) = delete;

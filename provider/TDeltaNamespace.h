@@ -7,6 +7,7 @@
 #include <string>
 #include <vector>
 
+#include "host/Export.h"
 #include "host/ICIMNamespace.h"
 
 namespace NORVZEL20 {
@@ -31,7 +32,7 @@ class TDeltaClass;
 /// Errors: TZELException with the status that each operation names, and the exceptions of the host's objects as they are. A null
 /// pointer where a namespace is needed fails the host's assertion "px != 0". The order of the virtual operations is part of the
 /// contract.
-class TDeltaNamespace : public ICIMNamespace, public boost::enable_shared_from_this<TDeltaNamespace> {
+class CIMDELTA_EXPORT TDeltaNamespace : public ICIMNamespace, public boost::enable_shared_from_this<TDeltaNamespace> {
   public:
     /// What a difference record (KALMO_Delta) tells, as its property "Type".
     enum EDeltaType {

@@ -3,6 +3,7 @@
 #include <boost/smart_ptr/shared_ptr.hpp>
 #include <string>
 
+#include "host/Export.h"
 #include "host/ICIMNamespace.h"
 #include "host/INamespaceProvider.h"
 #include "host/TZELStatusCode.h"
@@ -17,7 +18,7 @@ namespace NORVZEL20 {
 /// Threads: the first call of GetInstance must not overlap another, nor must the first of GetName: they take no lock. The load of
 /// the library makes the first of GetInstance, and a manager that looks at the name the first of GetName. After that any thread at
 /// any time; each operation but AllocateNamespace only reads.
-class TDeltaNamespaceProvider : public INamespaceProvider {
+class CIMDELTA_EXPORT TDeltaNamespaceProvider : public INamespaceProvider {
   public:
     /// The one provider, made by the first call. Never null.
     static boost::shared_ptr<TDeltaNamespaceProvider> GetInstance();

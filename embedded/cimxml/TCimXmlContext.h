@@ -9,6 +9,7 @@
 #include "embedded/cimxml/TLoadReport.h"
 #include "embedded/cimxml/TPopulateError.h"
 #include "embedded/cimxml/TTextPool.h"
+#include "host/Export.h"
 
 namespace NORVZEL20 {
 
@@ -18,7 +19,7 @@ class TXmlReader;
 ///
 /// "Fails" means everywhere in this folder: throws TPopulateError with the status named and with the place that GetPlace returns.
 /// Threads: one at a time, as the load that it belongs to.
-class TCimXmlContext {
+class CIMDELTA_INTERNAL_EXPORT TCimXmlContext {
   public:
     /// Where something stands in the document, counted from 1.
     struct TPlace {

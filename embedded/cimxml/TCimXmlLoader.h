@@ -12,6 +12,7 @@
 #include "embedded/cimxml/TCimXmlLateInstances.h"
 #include "embedded/store/TInMemNamespace.h"
 #include "embedded/store/TInMemStaging.h"
+#include "host/Export.h"
 #include "host/ICIMElement.h"
 
 namespace NORVZEL20 {
@@ -21,7 +22,7 @@ namespace NORVZEL20 {
 /// Until Commit is called, the destructor takes everything out again. Classes may come in any order, and instances before the
 /// classes that they need. Instances of a class are added in the document's order.
 /// Errors: every operation but Commit fails through the context. Threads: as the namespace.
-class TCimXmlLoader {
+class CIMDELTA_INTERNAL_EXPORT TCimXmlLoader {
   public:
     using TOwnKeys = TCimXmlInstanceBuilder::TOwnKeys;
     using TReadObjects = TCimXmlInstanceBuilder::TReadObjects;

@@ -8,6 +8,7 @@
 
 #include "embedded/cimxml/TLoadReport.h"
 #include "embedded/cimxml/TPopulateError.h"
+#include "host/Export.h"
 #include "host/ICIMElement.h"
 #include "host/ICIMNamespace.h"
 
@@ -31,7 +32,7 @@ namespace NORVZEL20 {
 /// 1024 properties of a class, an instance or an embedded object; 1024 methods of a class; 1024 qualifiers of an element; 256 key
 /// bindings of a path; 12 paths and 32 embedded objects inside of each other. Inherited parts count. An embedded object with a
 /// document type declaration is refused with kTypeMismatch (13).
-class TCimXmlPopulator {
+class CIMDELTA_EXPORT TCimXmlPopulator {
   public:
     /// Fills the buffer with at most that many bytes and returns how many. It may return as few as it likes: small pieces are
     /// gathered before they are parsed. 0 ends the document; the source is not called again after that. If it throws, the load

@@ -3,6 +3,7 @@
 #include <string>
 
 #include "embedded/cimxml/TCimXmlElement.h"
+#include "host/Export.h"
 
 namespace NORVZEL20 {
 
@@ -10,7 +11,7 @@ namespace NORVZEL20 {
 ///
 /// A state says which element is open and what it is a part of. An element that the table does not accept in a state is an error of
 /// the document. Cost: Find and GetEndAction are one array access.
-class TCimXmlTable {
+class CIMDELTA_INTERNAL_EXPORT TCimXmlTable {
   public:
     enum EState : unsigned char {
         kStart = 0,  ///< before the document's element

@@ -6,6 +6,7 @@
 #include <string_view>
 #include <vector>
 
+#include "host/Export.h"
 #include "host/ICIMClass.h"
 #include "host/ICIMInstance.h"
 #include "host/ICIMNamespace.h"
@@ -21,7 +22,7 @@ namespace NORVZEL20 {
 /// throws, its piece is kept, including the element that filled it; the next piece begins with it, and calling EndDocument again
 /// offers it again. StartDocument discards it.
 /// Threads: one at a time; the namespace must not change meanwhile.
-class TCimXmlWriter {
+class CIMDELTA_EXPORT TCimXmlWriter {
   public:
     using TSink = boost::function<void(std::string_view)>;
 

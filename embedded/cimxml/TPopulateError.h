@@ -3,6 +3,7 @@
 #include <cstddef>
 #include <string>
 
+#include "host/Export.h"
 #include "host/TZELException.h"
 
 namespace NORVZEL20 {
@@ -11,7 +12,7 @@ namespace NORVZEL20 {
 ///
 /// what() is the whole text for people: `file:line:column: message`, or `file: message` if no place applies.
 /// The status is that of TNamespacePopulator::PopulateFromXMLFile.
-class TPopulateError : public TZELException {
+class CIMDELTA_EXPORT TPopulateError : public TZELException {
   public:
     /// `line` and `column` count from 1; both are 0 if no place applies.
     TPopulateError(TZELStatusCode status, std::string message, std::string file, std::size_t line, std::size_t column);

@@ -5,6 +5,8 @@
 #include <memory>
 #include <string>
 
+#include "host/Export.h"
+
 struct XML_ParserStruct;
 
 namespace NORVZEL20 {
@@ -15,7 +17,7 @@ namespace NORVZEL20 {
 /// throws, the parse stops, and Parse, ParseBuffer or Finish throws the same exception.
 /// A document is in error if it refers to an external entity, which is never opened, or exceeds one of the bounds below.
 /// Threads: use a reader from one thread at a time; different readers may be used concurrently.
-class TXmlReader {
+class CIMDELTA_INTERNAL_EXPORT TXmlReader {
   public:
     static constexpr std::size_t kMaxDepth = 10000;               ///< open elements
     static constexpr std::size_t kMaxAttributes = 1000;           ///< attributes of one element

@@ -5,11 +5,13 @@
 #include <utility>
 #include <vector>
 
+#include "host/Export.h"
+
 namespace NORVZEL20 {
 
 /// A pattern of the operator LIKE: % stands for any text, _ for one character, [a-z] for one of the characters, [^a-z] for any
 /// other. A single character in brackets means itself: [%] is a percent sign. A bracket that is not closed means itself too.
-class TLikePattern {
+class CIMDELTA_INTERNAL_EXPORT TLikePattern {
   public:
     /// The pattern is in UTF-8; a byte that is not UTF-8 counts as one character. Cost: linear.
     explicit TLikePattern(std::string_view pattern);

@@ -6,6 +6,7 @@
 #include <string>
 #include <vector>
 
+#include "host/Export.h"
 #include "host/ICIMInstance.h"
 
 namespace NORVZEL20 {
@@ -33,7 +34,7 @@ struct TQueryCondition;
 ///          class of the instance itself.
 ///
 /// Threads: as for the namespace that the query runs on.
-class TQuery {
+class CIMDELTA_EXPORT TQuery {
   public:
     /// `language` is "WQL" or "DMTF:CQL", in any letter case.
     /// Errors: TQueryError with kInvalidQuery (16) or kQueryLanguageUnknown (17).

@@ -3,13 +3,14 @@
 #include <cstddef>
 #include <string>
 
+#include "host/Export.h"
 #include "host/TZELException.h"
 
 namespace NORVZEL20 {
 
 /// A query that cannot be answered: kInvalidQuery (16) for its text, kQueryLanguageUnknown (17) for its language, kNotFound (15)
 /// for an unknown class or property.
-class TQueryError : public TZELException {
+class CIMDELTA_EXPORT TQueryError : public TZELException {
   public:
     /// `position` is a byte offset, counted from 0.
     TQueryError(TZELStatusCode status, const std::string& message, std::size_t position);

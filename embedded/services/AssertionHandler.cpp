@@ -7,6 +7,7 @@
 
 #include "embedded/services/TAssertionFailure.h"
 #include "embedded/services/TCoreLog.h"
+#include "host/Export.h"
 
 namespace {
 
@@ -21,12 +22,13 @@ namespace {
 
 namespace boost {
 
-void assertion_failed(const char* expression, const char* function, const char* file, long line)
+CIMDELTA_EXPORT void assertion_failed(const char* expression, const char* function, const char* file, long line)
 {
     Fail(std::string("Assertion failed: ") + expression, function, file, line);
 }
 
-void assertion_failed_msg(const char* expression, const char* message, const char* function, const char* file, long line)
+CIMDELTA_EXPORT void assertion_failed_msg(const char* expression, const char* message, const char* function, const char* file,
+                                          long line)
 {
     Fail(std::string("Assertion failed: ") + expression + " (" + message + ")", function, file, line);
 }

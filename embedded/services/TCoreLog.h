@@ -1,11 +1,12 @@
 #pragma once
 
+#include "host/Export.h"
 #include "host/ILogger.h"
 
 namespace NORVZEL20 {
 
 /// The logger behind the core log: a TSpdLogger, or another one that was set.
-class TCoreLog {
+class CIMDELTA_EXPORT TCoreLog {
   public:
     TCoreLog() = delete;
 

@@ -3,13 +3,15 @@
 #include <string>
 #include <vector>
 
+#include "host/Export.h"
+
 namespace NORVZEL20 {
 
 /// A library of namespace providers, loaded at run time. It registers its providers while it is being loaded. It stays loaded until
 /// the process ends, because its objects may be in use anywhere.
 ///
 /// Threads: one Load at a time.
-class TProviderLibrary {
+class CIMDELTA_EXPORT TProviderLibrary {
   public:
     /// Loads the shared library at `path`. A library that is loaded already registers nothing new.
     /// Errors: TZELException with kFileError (11) if it cannot be loaded; the core log then gets the reason at level 0.

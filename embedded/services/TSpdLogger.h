@@ -2,6 +2,7 @@
 
 #include <memory>
 
+#include "host/Export.h"
 #include "host/ILogger.h"
 
 namespace spdlog {
@@ -14,7 +15,7 @@ namespace NORVZEL20 {
 /// removed. Level 0 is an error, 1 a warning, 2 information. Entries from level 3 on are details and not shown. Never throws.
 ///
 /// Threads: any, at any time.
-class TSpdLogger : public ILogger {
+class CIMDELTA_INTERNAL_EXPORT TSpdLogger : public ILogger {
   public:
     TSpdLogger();
     ~TSpdLogger() override;

@@ -5,13 +5,15 @@
 #include <utility>
 #include <vector>
 
+#include "host/Export.h"
+
 namespace NORVZEL20 {
 
 /// Finds the ordinal of an element that somebody else keeps by the hash of its key: open addressing, eight bytes an entry.
 ///
 /// The index sees no keys: the caller tells for each ordinal of the right hash whether it is the one. All operations take constant
 /// time on average; Add and Reserve may throw std::bad_alloc and then change nothing.
-class THashIndex {
+class CIMDELTA_EXPORT THashIndex {
   public:
     static constexpr std::uint32_t kNone = 0xffffffff;
 

@@ -3,6 +3,7 @@
 #include <algorithm>
 
 #include "embedded/store/TDeclCopy.h"
+#include "embedded/store/TInMemExtent.h"
 #include "embedded/store/TInMemNamespace.h"
 #include "embedded/value/TNameText.h"
 #include "host/RootClassName.h"
@@ -141,6 +142,11 @@ bool TInMemClass::IsAssociation(TCallContext) const
 bool TInMemClass::IsAbstract(TCallContext) const
 {
     return IsAbstract();
+}
+
+std::size_t TInMemClass::GetInstanceCount() const noexcept
+{
+    return fExtent != nullptr ? fExtent->GetCount() : 0;
 }
 
 bool TInMemClass::IsAbstract() const

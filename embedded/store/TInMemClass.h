@@ -8,15 +8,16 @@
 #include <vector>
 
 #include "embedded/store/THashIndex.h"
-#include "embedded/store/TInMemExtent.h"
 #include "embedded/store/TInMemInstance.h"
 #include "embedded/store/TInMemMethodDecl.h"
 #include "embedded/store/TInMemNamedElement.h"
 #include "embedded/store/TInMemPropertyDecl.h"
+#include "host/Export.h"
 #include "host/ICIMClass.h"
 
 namespace NORVZEL20 {
 
+class TInMemExtent;
 class TInMemNamespace;
 
 /// A class of an in-memory namespace.
@@ -25,7 +26,7 @@ class TInMemNamespace;
 /// and the slot of a removed one stays unused. Holds its superclass; is held by its namespace, its subclasses, its instances and
 /// the references to it. Where the namespace is gone, its operations work as far as they need none; the others throw status 18.
 /// Comparison operators compare names without regard to letter case; assignment takes nothing over.
-class TInMemClass final : public TInMemNamedElement<ICIMClass>, public boost::enable_shared_from_this<TInMemClass> {
+class CIMDELTA_EXPORT TInMemClass final : public TInMemNamedElement<ICIMClass>, public boost::enable_shared_from_this<TInMemClass> {
   public:
     static constexpr std::uint32_t kNoSlot = 0xffffffff;
 
@@ -135,7 +136,7 @@ class TInMemClass final : public TInMemNamedElement<ICIMClass>, public boost::en
     /// A new instance with every property null, one allocation.
     boost::shared_ptr<TInMemInstance> AllocateInMemInstance();
     /// The number of instances of exactly this class; 0 where it is not declared.
-    std::size_t GetInstanceCount() const noexcept { return fExtent ? fExtent->GetCount() : 0; }
+    std::size_t GetInstanceCount() const noexcept;
 
     /// Spells the name another way. Errors: status 5 where more than letter case differs.
     void SetSpelling(const std::string& name);

@@ -4,6 +4,7 @@
 #include <boost/smart_ptr/make_shared.hpp>
 
 #include "embedded/store/TInMemClass.h"
+#include "embedded/store/TInMemExtent.h"
 #include "embedded/store/TInMemNamespace.h"
 #include "embedded/value/TNameText.h"
 #include "host/TZELException.h"

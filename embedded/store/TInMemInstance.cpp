@@ -1,6 +1,7 @@
 #include "embedded/store/TInMemInstance.h"
 
 #include "embedded/store/TInMemClass.h"
+#include "embedded/store/TInMemExtent.h"
 #include "embedded/store/TInMemNamespace.h"
 #include "embedded/store/TPlacedAllocator.h"
 #include "host/TZELException.h"

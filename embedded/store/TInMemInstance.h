@@ -9,6 +9,7 @@
 #include <vector>
 
 #include "embedded/store/TInMemProperty.h"
+#include "host/Export.h"
 #include "host/ICIMInstance.h"
 
 namespace NORVZEL20 {
@@ -19,7 +20,7 @@ class TInMemClass;
 ///
 /// Made by TInMemClass::AllocateInMemInstance. A property that the class gets later is made when it is first asked for. Handles
 /// stay valid when the instance is deleted and when the namespace goes; AddToNamespace then throws status 18.
-class TInMemInstance final : public ICIMInstance, public boost::enable_shared_from_this<TInMemInstance> {
+class CIMDELTA_EXPORT TInMemInstance final : public ICIMInstance, public boost::enable_shared_from_this<TInMemInstance> {
   public:
     /// An instance of `cls` with every property null.
     static boost::shared_ptr<TInMemInstance> Create(boost::shared_ptr<TInMemClass> cls);

@@ -5,12 +5,13 @@
 
 #include "embedded/store/TInMemNamedElement.h"
 #include "embedded/store/TInMemParameter.h"
+#include "host/Export.h"
 #include "host/ICIMMethodDecl.h"
 
 namespace NORVZEL20 {
 
 /// A method's declaration: name, type of the result and parameters. Nothing implements it here.
-class TInMemMethodDecl : public TInMemNamedElement<ICIMMethodDecl> {
+class CIMDELTA_EXPORT TInMemMethodDecl : public TInMemNamedElement<ICIMMethodDecl> {
   public:
     TInMemMethodDecl(const std::string& name, TCIMValue::TCIMType type);
 

@@ -5,6 +5,7 @@
 #include <string>
 
 #include "embedded/store/TInMemQualifierSet.h"
+#include "host/Export.h"
 #include "host/ICIMClass.h"
 #include "host/ICIMMethodDecl.h"
 #include "host/ICIMNamedElement.h"
@@ -14,7 +15,7 @@ namespace NORVZEL20 {
 
 /// The qualifier operations of ICIMNamedElement, for classes, properties, methods and parameters alike.
 template <class TInterface>
-class TInMemNamedElement : public TInterface {
+class CIMDELTA_EXPORT TInMemNamedElement : public TInterface {
   public:
     /// Errors: status 5 for null.
     void AddQualifier(boost::shared_ptr<ICIMQualifier> qualifier, TCallContext context) override;

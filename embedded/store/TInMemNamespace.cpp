@@ -2,6 +2,7 @@
 
 #include <boost/smart_ptr/make_shared.hpp>
 
+#include "embedded/store/TInMemExtent.h"
 #include "embedded/store/TInMemNamespaceProvider.h"
 #include "embedded/value/EraseLast.h"
 #include "embedded/value/Trim.h"

@@ -10,6 +10,7 @@
 #include "embedded/store/TInMemQualifierDecl.h"
 #include "embedded/value/ILocated.h"
 #include "embedded/value/TNameText.h"
+#include "host/Export.h"
 #include "host/ICIMNamespace.h"
 
 namespace NORVZEL20 {
@@ -19,7 +20,9 @@ namespace NORVZEL20 {
 /// Owns its classes and instances; handles that outlive it stay valid (see TInMemClass and TInMemInstance). To load many things and
 /// take them back where one fails, use TInMemStaging. Assignment takes nothing over.
 /// Threads: one at a time for each namespace; different namespaces may be used at once.
-class TInMemNamespace final : public ICIMNamespace, public ILocated, public boost::enable_shared_from_this<TInMemNamespace> {
+class CIMDELTA_EXPORT TInMemNamespace final : public ICIMNamespace,
+                                              public ILocated,
+                                              public boost::enable_shared_from_this<TInMemNamespace> {
   public:
     /// An empty namespace of that name; slashes in front and behind are taken off.
     static boost::shared_ptr<TInMemNamespace> Create(const std::string& name);

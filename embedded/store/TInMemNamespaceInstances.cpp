@@ -1,5 +1,6 @@
 // Finding, changing and removing instances by path.
 
+#include "embedded/store/TInMemExtent.h"
 #include "embedded/store/TInMemNamespace.h"
 #include "embedded/value/TValueText.h"
 #include "host/TZELException.h"

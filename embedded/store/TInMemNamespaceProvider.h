@@ -1,11 +1,12 @@
 #pragma once
 
+#include "host/Export.h"
 #include "host/INamespaceProvider.h"
 
 namespace NORVZEL20 {
 
 /// The provider "inmem": each namespace it makes is empty and holds in memory what it is given.
-class TInMemNamespaceProvider : public INamespaceProvider {
+class CIMDELTA_INTERNAL_EXPORT TInMemNamespaceProvider : public INamespaceProvider {
   public:
     /// The one provider of the process. Threads: any.
     static boost::shared_ptr<TInMemNamespaceProvider> GetInstance();

@@ -3,12 +3,13 @@
 #include <string>
 
 #include "embedded/store/TInMemNamedElement.h"
+#include "host/Export.h"
 #include "host/ICIMNamedElement.h"
 
 namespace NORVZEL20 {
 
 /// A parameter of a method: name, type, and for references the class, for arrays of fixed size that size.
-class TInMemParameter : public TInMemNamedElement<ICIMNamedElement> {
+class CIMDELTA_EXPORT TInMemParameter : public TInMemNamedElement<ICIMNamedElement> {
   public:
     TInMemParameter(const std::string& name, TCIMValue::TCIMType type);
 

@@ -2,6 +2,7 @@
 
 #include <cstdint>
 
+#include "host/Export.h"
 #include "host/ICIMProperty.h"
 
 namespace NORVZEL20 {
@@ -11,7 +12,7 @@ class TInMemInstance;
 /// One property of an in-memory instance; 32 bytes inside the instance's own block.
 ///
 /// Handles are shared pointers into the instance, which they keep alive.
-class TInMemProperty final : public ICIMProperty {
+class CIMDELTA_EXPORT TInMemProperty final : public ICIMProperty {
   public:
     TInMemProperty(std::uint32_t slot, std::uint32_t position, const TCIMValue& value) noexcept;
     TInMemProperty(const TInMemProperty&) = delete;

@@ -6,6 +6,7 @@
 
 #include "embedded/store/TInMemNamedElement.h"
 #include "embedded/store/TInMemStaticProperty.h"
+#include "host/Export.h"
 #include "host/ICIMPropertyDecl.h"
 
 namespace NORVZEL20 {
@@ -16,7 +17,8 @@ class TInMemClass;
 ///
 /// Made by TInMemClass::AllocatePropertyDecl, given its qualifiers, then added with TInMemClass::AddPropertyDecl. From then on
 /// AddQualifier throws status 19 where a Key that is not true would take a key away from a class with instances.
-class TInMemPropertyDecl : public TInMemNamedElement<ICIMPropertyDecl>, public boost::enable_shared_from_this<TInMemPropertyDecl> {
+class CIMDELTA_EXPORT TInMemPropertyDecl : public TInMemNamedElement<ICIMPropertyDecl>,
+                                           public boost::enable_shared_from_this<TInMemPropertyDecl> {
   public:
     /// The value gives type and default. A reference in it names the class that references point to; without keys it is no default.
     TInMemPropertyDecl(const std::string& name, const TCIMValue& value);

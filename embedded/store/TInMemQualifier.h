@@ -2,12 +2,13 @@
 
 #include <string>
 
+#include "host/Export.h"
 #include "host/ICIMQualifier.h"
 
 namespace NORVZEL20 {
 
 /// A qualifier on an element of the in-memory namespace. Immutable.
-class TInMemQualifier : public ICIMQualifier {
+class CIMDELTA_INTERNAL_EXPORT TInMemQualifier : public ICIMQualifier {
   public:
     TInMemQualifier(const std::string& name, const TCIMValue& value, ICIMQualifierDecl::EFlavor flavor);
 

@@ -2,12 +2,13 @@
 
 #include <string>
 
+#include "host/Export.h"
 #include "host/ICIMQualifierDecl.h"
 
 namespace NORVZEL20 {
 
 /// A qualifier's declaration as the in-memory namespace keeps it. Immutable.
-class TInMemQualifierDecl : public ICIMQualifierDecl {
+class CIMDELTA_EXPORT TInMemQualifierDecl : public ICIMQualifierDecl {
   public:
     /// The value gives type and default; it may be a typed null.
     TInMemQualifierDecl(const std::string& name, const TCIMValue& value, EScope scope, EFlavor flavor);

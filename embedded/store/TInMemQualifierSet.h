@@ -5,6 +5,7 @@
 #include <string_view>
 #include <vector>
 
+#include "host/Export.h"
 #include "host/ICIMQualifier.h"
 
 namespace NORVZEL20 {
@@ -12,7 +13,7 @@ namespace NORVZEL20 {
 /// The qualifiers of one element: its own, and those that it inherits from the element it stems from.
 ///
 /// A qualifier is inherited where its flavor says so (to the subclass) and the element has none of that name itself.
-class TInMemQualifierSet {
+class CIMDELTA_EXPORT TInMemQualifierSet {
   public:
     /// Letter case does not count.
     static bool IsNamed(const ICIMQualifier& qualifier, std::string_view name);

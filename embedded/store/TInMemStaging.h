@@ -4,7 +4,9 @@
 #include <unordered_map>
 #include <vector>
 
+#include "embedded/store/TInMemExtent.h"
 #include "embedded/store/TInMemNamespace.h"
+#include "host/Export.h"
 
 namespace NORVZEL20 {
 
@@ -14,7 +16,7 @@ namespace NORVZEL20 {
 /// generated numbers included; classes that were there must not be changed, except for static values that it was told to keep, and
 /// nothing removed, while a staging is open.
 /// Threads: as the namespace.
-class TInMemStaging {
+class CIMDELTA_INTERNAL_EXPORT TInMemStaging {
   public:
     /// `ns` must not be null.
     explicit TInMemStaging(boost::shared_ptr<TInMemNamespace> ns) noexcept;

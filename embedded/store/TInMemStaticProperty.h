@@ -1,5 +1,6 @@
 #pragma once
 
+#include "host/Export.h"
 #include "host/ICIMProperty.h"
 
 namespace NORVZEL20 {
@@ -9,7 +10,7 @@ class TInMemPropertyDecl;
 /// The value of a static property, one for the class, its subclasses and all their instances. Lives in its declaration.
 ///
 /// Its marks and its earlier value are one for all of them, too.
-class TInMemStaticProperty : public ICIMProperty {
+class CIMDELTA_EXPORT TInMemStaticProperty : public ICIMProperty {
   public:
     /// All that changes.
     struct TState {

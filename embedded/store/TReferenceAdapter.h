@@ -4,6 +4,7 @@
 #include <vector>
 
 #include "embedded/store/TInMemNamespace.h"
+#include "host/Export.h"
 #include "host/TCIMReference.h"
 
 namespace NORVZEL20 {
@@ -12,7 +13,7 @@ namespace NORVZEL20 {
 ///
 /// For references made before their class was declared, or before a name got another letter case. Those within keys, arrays and
 /// embedded objects are adapted too.
-class TReferenceAdapter {
+class CIMDELTA_INTERNAL_EXPORT TReferenceAdapter {
   public:
     /// `ns` must outlive this.
     explicit TReferenceAdapter(const TInMemNamespace& ns) noexcept : fNamespace(ns) {}

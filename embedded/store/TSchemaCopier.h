@@ -6,13 +6,14 @@
 #include <vector>
 
 #include "embedded/store/TInMemNamespace.h"
+#include "host/Export.h"
 
 namespace NORVZEL20 {
 
 /// Declares in one namespace what another one declares. What is copied does not change with where it came from.
 ///
 /// Qualifier declarations that the copies need and the target lacks are copied too. Instances are not.
-class TSchemaCopier {
+class CIMDELTA_INTERNAL_EXPORT TSchemaCopier {
   public:
     explicit TSchemaCopier(boost::shared_ptr<TInMemNamespace> target) : fTarget(std::move(target)) {}
 

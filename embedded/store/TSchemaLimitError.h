@@ -2,12 +2,13 @@
 
 #include <string>
 
+#include "host/Export.h"
 #include "host/TZELException.h"
 
 namespace NORVZEL20 {
 
 /// A class would go beyond TSchemaLimits: status 31.
-class TSchemaLimitError : public TZELException {
+class CIMDELTA_EXPORT TSchemaLimitError : public TZELException {
   public:
     /// `text` says which limit, for people.
     explicit TSchemaLimitError(const std::string& text);

@@ -2,10 +2,12 @@
 
 #include <string>
 
+#include "host/Export.h"
+
 namespace NORVZEL20 {
 
 /// A namespace that has a name. Object paths made in it begin with that name. A namespace without this interface has no name.
-class ILocated {
+class CIMDELTA_EXPORT ILocated {
   public:
     virtual ~ILocated() = default;
 

@@ -4,6 +4,7 @@
 #include <string_view>
 #include <vector>
 
+#include "host/Export.h"
 #include "host/ICIMQualifierDecl.h"
 #include "host/TCIMValue.h"
 
@@ -14,7 +15,7 @@ namespace NORVZEL20 {
 ///
 /// One owner builds it, then it is held as boost::shared_ptr<const TEmbeddedObject> and never changes.
 /// Threads: the owner until it is built; afterwards any thread may read it.
-class TEmbeddedObject {
+class CIMDELTA_INTERNAL_EXPORT TEmbeddedObject {
   public:
     struct TQualifier {
         std::string fName;

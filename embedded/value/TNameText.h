@@ -7,11 +7,13 @@
 #include <string_view>
 #include <unordered_map>
 
+#include "host/Export.h"
+
 namespace NORVZEL20 {
 
 /// Names of classes, properties, qualifiers and namespaces. The letter case of ASCII letters does not matter. No locale is
 /// involved.
-class TNameText {
+class CIMDELTA_EXPORT TNameText {
   public:
     TNameText() = delete;
 

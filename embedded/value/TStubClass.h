@@ -1,5 +1,6 @@
 #pragma once
 
+#include "host/Export.h"
 #include "host/ICIMClass.h"
 
 namespace NORVZEL20 {
@@ -9,7 +10,7 @@ namespace NORVZEL20 {
 /// It is in no namespace and has no superclass, properties, methods, instances or qualifiers. Looking one up throws kNotFound (15),
 /// enumerations do not call back, and every change throws kNotSupported (31). Like all classes, two stubs are equal if their names
 /// are.
-class TStubClass : public ICIMClass {
+class CIMDELTA_INTERNAL_EXPORT TStubClass : public ICIMClass {
   public:
     explicit TStubClass(std::string name);
 

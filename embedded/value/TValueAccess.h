@@ -3,6 +3,7 @@
 #include <cstring>
 
 #include "embedded/value/TSharedText.h"
+#include "host/Export.h"
 #include "host/TCIMDateTime.h"
 #include "host/TCIMReference.h"
 #include "host/TCIMValue.h"
@@ -10,7 +11,7 @@
 namespace NORVZEL20 {
 
 /// Unchecked access to the contents of a value, for this library only.
-class TValueAccess {
+class CIMDELTA_INTERNAL_EXPORT TValueAccess {
   public:
     /// How a value holds its contents. From kSharedText on, that is a pointer to a block that begins with TCounted.
     enum EForm : unsigned char {

@@ -4,12 +4,13 @@
 #include <string>
 #include <string_view>
 
+#include "host/Export.h"
 #include "host/TCIMValue.h"
 
 namespace NORVZEL20 {
 
 /// The text forms of values. They do not depend on a locale.
-class TValueText {
+class CIMDELTA_INTERNAL_EXPORT TValueText {
   public:
     TValueText() = delete;
 

@@ -4,6 +4,7 @@
 #include <string_view>
 
 #include "embedded/value/TEmbeddedObject.h"
+#include "host/Export.h"
 #include "host/TCIMReference.h"
 #include "host/TCIMValue.h"
 
@@ -13,7 +14,7 @@ namespace NORVZEL20 {
 ///
 /// The result is well-formed for every value: bytes that are not UTF-8 and characters that XML 1.0 does not allow become U+FFFD. A
 /// carriage return is written as a character reference, because a reader would turn it into a line feed.
-class TValueXml {
+class CIMDELTA_INTERNAL_EXPORT TValueXml {
   public:
     TValueXml() = delete;
 
