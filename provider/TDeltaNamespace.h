@@ -139,8 +139,6 @@ class CIMDELTA_EXPORT TDeltaNamespace : public ICIMNamespace, public boost::enab
     TDeltaNamespace& operator=(const TDeltaNamespace& other);
 
   private:
-    friend struct TTestAccess;
-
     boost::shared_ptr<ICIMClass> GetWrappedClass(const std::string& name, const TCallContext& context);
 
     std::string fSpecFileName;

@@ -11,21 +11,18 @@
 
 namespace NORVZEL20 {
 
-/// The plug-in's friend: shows tests what no operation tells.
+/// Shows tests the state of the plug-in's objects that no operation returns. A friend of the types that are not installed.
 struct TTestAccess {
     using TClassCache = std::vector<std::map<std::string, boost::shared_ptr<TDeltaClass>>>;
 
-    static const std::string& SpecFileName(const TDeltaNamespace& ns) { return ns.fSpecFileName; }
-    static const TClassCache& ClassCache(const TDeltaNamespace& ns) { return ns.fClassCache; }
+    static const std::string& SpecFileName(const TDeltaNamespace& ns);
+    static const TClassCache& ClassCache(const TDeltaNamespace& ns);
     /// A wrapper holds its delta namespace, which holds the wrapper: forgetting the wrappers lets both go.
-    static void ForgetWrappers(TDeltaNamespace& ns) { ns.fClassCache.assign(ns.fClassCache.size(), {}); }
-    static void PutWrapper(TDeltaNamespace& ns, std::size_t index, const std::string& name, boost::shared_ptr<TDeltaClass> wrapper)
-    {
-        ns.fClassCache.at(index)[name] = wrapper;
-    }
-    static const std::vector<boost::shared_ptr<ICIMNamespace>>& CompareList(const TDeltaNamespace& ns) { return ns.fCompareList; }
-    static boost::shared_ptr<ICIMNamespace> Store(const TDeltaNamespace& ns) { return ns.fDeltaStore; }
-    static void SetStore(TDeltaNamespace& ns, boost::shared_ptr<ICIMNamespace> store) { ns.fDeltaStore = store; }
+    static void ForgetWrappers(TDeltaNamespace& ns);
+    static void PutWrapper(TDeltaNamespace& ns, std::size_t index, const std::string& name, boost::shared_ptr<TDeltaClass> wrapper);
+    static const std::vector<boost::shared_ptr<ICIMNamespace>>& CompareList(const TDeltaNamespace& ns);
+    static boost::shared_ptr<ICIMNamespace> Store(const TDeltaNamespace& ns);
+    static void SetStore(TDeltaNamespace& ns, boost::shared_ptr<ICIMNamespace> store);
 
     static boost::shared_ptr<ICIMClass> WrappedClass(const TDeltaClass& cls) { return cls.fClass; }
     static const std::map<std::string, const TCIMReference>& Aliases(const TDeltaClass& cls) { return cls.fObjectPathAliases; }
