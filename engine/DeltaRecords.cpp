@@ -2,6 +2,18 @@
 #include "provider/DeltaNames.h"
 #include "provider/TDeltaClass.h"
 
+// A difference is stored as three kinds of instances in the delta namespace:
+//
+//     KALMO_DeltaClass               one for each class with differences
+//     KALMO_Delta                    one for each difference in the class: what kind, which instance, which property, which
+//     namespaces KALMO_DeltaClassAssocToDelta   one for each KALMO_Delta, with references to it and to its KALMO_DeltaClass
+//
+// The engine sets no keys. The store generates them when an instance is added, so the association must be made last: before that,
+// the two references would have no keys. All instances are plain instances of the delta namespace's store.
+//
+// If keys are excluded, a record may name an instance by a key text that is no object path. An alias on the class wrapper says
+// which path the text stands for.
+
 namespace NORVZEL20 {
 
 namespace {

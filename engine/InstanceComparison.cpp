@@ -1,6 +1,14 @@
 #include "engine/TCIMDiffEngine.h"
 #include "spec/TDiffClassRules.h"
 
+// Two matched instances are compared property by property, in the order of the list of properties:
+//
+//     reference    the texts of both paths (see InstanceKeys.cpp); two null references are equal
+//     all others   TCIMValue::operator==
+//
+// Each difference is entered into the map of the class. With exactly two namespaces the reference takes over the other value at
+// once. If keys are excluded, both instances also get an alias, because the record cannot name them by their paths.
+
 namespace NORVZEL20 {
 
 bool TCIMDiffEngine::IsDifferent(boost::shared_ptr<TDiffClassRules> rules, const TCIMValue& master, const TCIMValue& other)

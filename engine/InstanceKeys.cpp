@@ -3,6 +3,16 @@
 #include "host/TAddKeyNamesToVectorCallback.h"
 #include "spec/TDiffClassRules.h"
 
+// Instances are matched by the text of their key, so the key must be the same text in every namespace:
+//
+//     Disk.Name="sda",System="web01"      class and keys, as the path of TCIMReference writes them
+//     Disk.Name="sda"                     the same, if the rules exclude the key System
+//
+// The path has no namespace, because that differs between the namespaces compared.
+//
+// The values of reference properties are compared by text too. If the rules exclude keys, the text is made in the same way.
+// Otherwise it is the text of the path itself, with the namespace that it names.
+
 namespace NORVZEL20 {
 
 namespace {
@@ -18,7 +28,7 @@ TCIMReference MakeKeylessPath(boost::shared_ptr<ICIMClass> cls)
 
 std::string TCIMDiffEngine::buildPath(boost::shared_ptr<TDiffClassRules> rules, boost::shared_ptr<ICIMInstance> instance)
 {
-    // Held to the end: the names are the class's own.
+    // Keeps the class alive, because the pointers to its key names are used below.
     const boost::shared_ptr<ICIMClass> cls = instance->GetClass(TCallContext());
     std::vector<const std::string*> names;
     cls->EnumerateKeyNames(TAddKeyNamesToVectorCallback(&names), TCallContext());

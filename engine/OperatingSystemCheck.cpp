@@ -10,9 +10,10 @@ namespace NORVZEL20 {
 
 namespace {
 
-/// Appends the namespace's operating systems to `systems` and returns the type of the first one of all.
+/// Appends the namespace's operating systems to `systems` and returns the type of the first element of `systems`.
 ///
-/// That first one is always the reference's, so that inventories of different operating systems are compared all the same.
+/// The first element always comes from the reference, whose type is thus compared with itself. Inventories of different operating
+/// systems pass the check; a namespace without the class fails it.
 unsigned short AppendOperatingSystems(ICIMNamespace& ns, std::vector<boost::shared_ptr<ICIMInstance>>& systems)
 {
     const boost::shared_ptr<ICIMClass> cls = ns.GetClass(kOperatingSystemClass, TCallContext());
@@ -24,7 +25,7 @@ unsigned short AppendOperatingSystems(ICIMNamespace& ns, std::vector<boost::shar
 
 void TCIMDiffEngine::CheckOperatingSystems()
 {
-    // Made beforehand, so that a check that fails for lack of memory can still be told.
+    // Made in advance: if the check fails because memory ran out, the message exists already.
     const std::string failed = "TCIMDiffEngine: Failed to get all properties to check Schema match\n";
     try {
         std::vector<boost::shared_ptr<ICIMInstance>> systems;

@@ -90,7 +90,7 @@ void TCIMDiffEngine::TClassComparison::CompareWithNamespace(std::size_t index)
     NoteAbsentInstances(index);
 }
 
-/// Whether the namespace has the class. It may lack one of which the reference has no instances.
+/// Whether the namespace has the class. It may lack the class only if the reference has no instances of it.
 bool TCIMDiffEngine::TClassComparison::FindClassIn(std::size_t index)
 {
     try {
@@ -143,19 +143,19 @@ void TCIMDiffEngine::TClassComparison::RecordAbsentInstances(bool excludesKeys)
     for (const auto& [key, indices] : fAbsent) {
         RecordAbsentInstance(key, indices, excludesKeys);
         if (HasTwoNamespaces()) {
-            MarkPropertiesRemoved(*fMaster[key].instance);
+            MarkPropertiesRemoved(*fMaster.at(key).instance);
         }
     }
 }
 
-/// With excluded keys the record tells the whole path, because the key may stand for several instances.
+/// If keys are excluded, the record names the instance by its whole path, because several instances may share the key.
 void TCIMDiffEngine::TClassComparison::RecordAbsentInstance(const std::string& key, const TIndices& indices, bool excludesKeys)
 {
     if (!excludesKeys) {
         fEngine.createCIMDiff(fClassRecord, TDeltaNamespace::kInstanceRemoved, key, "", indices);
         return;
     }
-    const TCIMReference path = fMaster[key].instance->GetReference(TCallContext());
+    const TCIMReference path = fMaster.at(key).instance->GetReference(TCallContext());
     fEngine.createObjectPathAlias(fClassName, key, path, 0);
     fEngine.createCIMDiff(fClassRecord, TDeltaNamespace::kInstanceRemoved, path.GetPath(), "", indices);
 }
@@ -170,6 +170,7 @@ void TCIMDiffEngine::TClassComparison::RecordMissingInstances()
     for (const auto& [key, indices] : fMissing) {
         fEngine.createCIMDiff(fClassRecord, TDeltaNamespace::kInstanceAdded, key, "", indices);
         if (HasTwoNamespaces()) {
+            // Without an entry, the null pointer that this adds fails the host's assertion.
             CopyToReference(others[key].instance);
         }
     }

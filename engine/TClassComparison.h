@@ -5,12 +5,12 @@
 
 namespace NORVZEL20 {
 
-/// The comparison of one class of the reference with the same-named class of every other namespace, without its subclasses.
+/// The comparison of one class of the reference with the class of the same name in every other namespace, without subclasses.
 class TCIMDiffEngine::TClassComparison {
   public:
     TClassComparison(TCIMDiffEngine& engine, boost::shared_ptr<ICIMClass> cls);
 
-    /// Compares and writes the records. To be called once.
+    /// Compares and writes the records. Call it once. Errors: as TCIMDiffEngine::compare.
     void Run();
 
   private:
@@ -35,11 +35,11 @@ class TCIMDiffEngine::TClassComparison {
     std::string fClassName;
     boost::shared_ptr<TDiffClassRules> fRules;
     std::vector<std::string> fProperties;
-    boost::shared_ptr<ICIMClass> fOtherClass;  // of the namespace compared last
+    boost::shared_ptr<ICIMClass> fOtherClass;  // of the last namespace that has the class
     std::map<std::string, TMasterInstance> fMaster;
-    std::map<std::string, TIndices> fAbsent;                              // keys that the listed namespaces lack
-    std::map<std::string, TIndices> fMissing;                             // keys that the reference lacks
-    std::map<std::string, std::map<std::string, TIndices>> fDifferences;  // key, property
+    std::map<std::string, TIndices> fAbsent;   // by key, the namespaces that lack the instance
+    std::map<std::string, TIndices> fMissing;  // by key, the namespaces whose instance the reference lacks
+    std::map<std::string, std::map<std::string, TIndices>> fDifferences;  // by key and property
     boost::shared_ptr<ICIMInstance> fClassRecord;
 };
 

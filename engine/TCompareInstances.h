@@ -5,9 +5,10 @@
 
 namespace NORVZEL20 {
 
-/// Takes the instances of one class of one namespace, and compares each with the reference's instance of the same key.
+/// Receives the instances of one class of one namespace, and compares each with the reference's instance of the same key.
 ///
-/// Everything but the rules is the caller's and must outlive the enumeration.
+/// Pass it to ICIMClass::EnumerateInstances. It owns the rules only; everything else is the caller's and must outlive the
+/// enumeration.
 class TCIMDiffEngine::TCompareInstances : public TUnaryFunction<boost::shared_ptr<ICIMInstance>> {
   public:
     TCompareInstances(TCIMDiffEngine* engine, boost::shared_ptr<TDiffClassRules> rules,
@@ -16,7 +17,8 @@ class TCIMDiffEngine::TCompareInstances : public TUnaryFunction<boost::shared_pt
                       std::vector<std::string>* propertyList);
     TCompareInstances(const TCompareInstances& other) = default;
 
-    /// Marks the reference's instance as found and compares with it, or enters the key as missing from the reference. Always true.
+    /// If the reference has an instance of the same key, marks that one as found and compares the two. Otherwise enters the key as
+    /// missing from the reference. Always returns true, so that the enumeration goes on.
     bool operator()(boost::shared_ptr<ICIMInstance> instance);
 
   private:

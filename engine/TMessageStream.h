@@ -4,7 +4,8 @@
 
 namespace NORVZEL20 {
 
-/// Puts together the text of a message. Throws where memory is short (std::bad_alloc), so that no text is cut without a word.
+/// A stream for the text of a message. Unlike a plain stream it throws std::bad_alloc if memory runs out, so a message is never
+/// cut.
 class TMessageStream : public std::ostringstream {
   public:
     TMessageStream() { exceptions(std::ios_base::badbit); }

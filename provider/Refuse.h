@@ -4,7 +4,7 @@
 
 namespace NORVZEL20 {
 
-/// Answers an operation that would change the schema: status 31.
+/// Refuses an operation that would change the schema. Errors: kNotSupported (31), always.
 [[noreturn]] inline void Refuse()
 {
     throw TZELException(TZELStatusCode::kNotSupported);

@@ -10,7 +10,8 @@
 
 namespace NORVZEL20 {
 
-/// Turns an enumeration of classes into one of the same-named classes of a namespace.
+/// Stands between an enumeration of classes and its callback: for each class, the callback gets the class of the same name in
+/// another namespace instead.
 ///
 /// The callback is not copied and must outlive the enumeration.
 class CIMDELTA_INTERNAL_EXPORT TCallbackWrapClass : public TUnaryFunction<boost::shared_ptr<ICIMClass>> {
@@ -18,8 +19,8 @@ class CIMDELTA_INTERNAL_EXPORT TCallbackWrapClass : public TUnaryFunction<boost:
     TCallbackWrapClass(boost::shared_ptr<ICIMNamespace> ns, const boost::function<bool(boost::shared_ptr<ICIMClass>)>* callback,
                        const TCallContext& context);
 
-    /// Gets the namespace's class of the name of `cls` and returns what the callback says to it.
-    /// Errors: those of class and namespace; boost::bad_function_call where the callback is empty.
+    /// Calls the callback with the namespace's class of the same name as `cls`, and returns its result.
+    /// Errors: those of the class and the namespace; boost::bad_function_call if the callback is empty.
     bool operator()(boost::shared_ptr<ICIMClass> cls) const;
 
   private:

@@ -7,6 +7,15 @@
 #include "provider/TCallbackWrapClass.h"
 #include "provider/TDeltaNamespace.h"
 
+// The wrapper has three kinds of operations:
+//
+//     passed on    to the wrapped class, with all arguments as they are
+//     wrapped      passed on too, but classes in the answer are replaced by the delta namespace's wrappers: a returned class by
+//                  TDeltaNamespace::GetClass, the classes of an enumeration by TCallbackWrapClass
+//     refused      with Refuse(), without a call to the wrapped class
+//
+// The call context goes along, because its "nsIndex" selects the compared namespace from which the next wrapper is made.
+
 namespace NORVZEL20 {
 
 TDeltaClass::TDeltaClass(boost::shared_ptr<TDeltaNamespace> deltaNamespace, boost::shared_ptr<ICIMClass> cls)

@@ -14,17 +14,18 @@ namespace NORVZEL20 {
 
 class TDeltaNamespace;
 
-/// A class of a compared namespace as the delta namespace shows it.
+/// A class of a compared namespace as the delta namespace shows it: a wrapper around the compared namespace's own class.
 ///
-/// Questions go to the wrapped class. Each class handed out is the delta namespace's wrapper, chosen with the same call context,
-/// never the compared namespace's own. What would make a new element or change the class itself is refused with status 31, while
-/// elements that exist already are added to, and removed from, the wrapped class.
+/// Operations are passed to the wrapped class, except those that are documented here. Three rules hold for all of them:
+/// - A class that an operation returns, or passes to a callback, is a wrapper too. The delta namespace's GetClass supplies it for
+///   the same call context, so a client that walks from class to class stays in the delta namespace.
+/// - An operation that would make a new element or change the class itself is refused with kNotSupported (31).
+/// - An operation that adds or removes an existing element (Add..., Remove...) changes the wrapped class.
 ///
-/// Made by TDeltaNamespace::GetClass and owned by shared pointers. Holds the delta namespace and the wrapped class, and always
-/// the same ones.
-/// Threads: as the delta namespace.
-/// Errors: those of the wrapped class and of the delta namespace as they are, beyond those named here. The order of the virtual
-/// operations is part of the contract.
+/// Made by TDeltaNamespace::GetClass and owned by shared pointers. Holds the delta namespace and the wrapped class as long as it
+/// lives. Threads: as the delta namespace.
+/// Errors: besides those named here, the errors of the wrapped class and of the delta namespace, unchanged. The order of the
+/// virtual operations is part of the contract.
 class CIMDELTA_INTERNAL_EXPORT TDeltaClass : public ICIMClass, public boost::enable_shared_from_this<TDeltaClass> {
   public:
     TDeltaClass(boost::shared_ptr<TDeltaNamespace> deltaNamespace, boost::shared_ptr<ICIMClass> cls);
@@ -33,25 +34,25 @@ class CIMDELTA_INTERNAL_EXPORT TDeltaClass : public ICIMClass, public boost::ena
 
     void Validate(TCallContext context) const override;
 
-    /// Refused with status 31.
+    /// Refused with kNotSupported (31).
     void AddToNamespace(TCallContext context) override;
-    /// Refused with status 31.
+    /// Refused with kNotSupported (31).
     void RemoveFromNamespace(TCallContext context) override;
-    /// Refused with status 31.
+    /// Refused with kNotSupported (31).
     void ModifyClass(boost::shared_ptr<ICIMClass> cls, TCallContext context) override;
 
     const std::string& GetName(TCallContext context) const override;
-    /// The compared namespace, not the delta namespace.
+    /// Returns the compared namespace, not the delta namespace.
     boost::shared_ptr<ICIMNamespace> GetNamespace(TCallContext context) const override;
     bool IsAssociation(TCallContext context) const override;
     bool IsAbstract(TCallContext context) const override;
     bool IsRootClass(TCallContext context) const override;
-    /// The wrapper of the superclass. Must not be asked of a top-level class: that fails the host's assertion.
+    /// The wrapper of the superclass. Do not call it for a top-level class: that fails the host's assertion.
     boost::shared_ptr<ICIMClass> GetSuperClass(TCallContext context) const override;
-    /// Calls back with wrappers, as do the other two enumerations of classes.
+    /// Calls back with wrappers. So do EnumerateAssociatedClasses and EnumerateAssociationClasses.
     void EnumerateSubClasses(const boost::function<bool(boost::shared_ptr<ICIMClass>)>& callback, bool deep,
                              TCallContext context) override;
-    /// `cls` must be a wrapper; any other class fails the host's assertion.
+    /// `cls` must be a wrapper. Any other class fails the host's assertion.
     bool IsSubclassOf(boost::shared_ptr<const ICIMClass> cls, TCallContext context) const override;
     void EnumerateAssociatedClasses(const boost::function<bool(boost::shared_ptr<ICIMClass>)>& callback,
                                     const std::string& associationClass, const std::string& resultClass, const std::string& role,
@@ -60,7 +61,7 @@ class CIMDELTA_INTERNAL_EXPORT TDeltaClass : public ICIMClass, public boost::ena
                                      const std::string& resultClass, const std::string& role, TCallContext context) override;
     void EnumerateKeyNames(const boost::function<bool(const std::string*)>& callback, TCallContext context) const override;
 
-    /// Refused with status 31.
+    /// Refused with kNotSupported (31).
     boost::shared_ptr<ICIMPropertyDecl> AllocatePropertyDecl(const std::string& name, const TCIMValue& value,
                                                              TCallContext context) override;
     boost::shared_ptr<ICIMPropertyDecl> GetPropertyDecl(const std::string& name, TCallContext context) const override;
@@ -71,21 +72,21 @@ class CIMDELTA_INTERNAL_EXPORT TDeltaClass : public ICIMClass, public boost::ena
     void EnumerateStaticProperties(const boost::function<bool(boost::shared_ptr<ICIMProperty>)>& callback,
                                    TCallContext context) override;
 
-    /// Refused with status 31.
+    /// Refused with kNotSupported (31).
     boost::shared_ptr<ICIMInstance> AllocateInstance(TCallContext context) override;
     void EnumerateInstances(const boost::function<bool(boost::shared_ptr<ICIMInstance>)>& callback, bool deep,
                             TCallContext context) override;
 
-    /// Refused with status 31.
+    /// Refused with kNotSupported (31).
     boost::shared_ptr<ICIMMethodDecl> AllocateMethodDecl(const std::string& name, TCIMValue::TCIMType type,
                                                          TCallContext context) override;
     boost::shared_ptr<ICIMMethodDecl> GetMethodDecl(const std::string& name, TCallContext context) const override;
     void EnumerateMethodDecls(const boost::function<bool(boost::shared_ptr<ICIMMethodDecl>)>& callback,
                               TCallContext context) const override;
-    /// Runs nothing and returns null; `parameters` stays as it is.
+    /// Runs no method. Returns null and leaves `parameters` unchanged.
     TCIMValue InvokeMethod(const std::string& name, TCallContext& parameters, TCallContext context) override;
 
-    /// The names alone count, byte for byte: wrappers of one class in two compared namespaces are equal.
+    /// Compares the classes' names, byte for byte, and nothing else. Wrappers of one class in two compared namespaces are equal.
     bool operator==(ICIMClass& other) const override;
     bool operator<(ICIMClass& other) const override;
     /// Copies nothing.
@@ -104,23 +105,23 @@ class CIMDELTA_INTERNAL_EXPORT TDeltaClass : public ICIMClass, public boost::ena
     bool RemoveMethodDecl(boost::shared_ptr<ICIMMethodDecl> decl) override;
 
     void AddQualifier(boost::shared_ptr<ICIMQualifier> qualifier, TCallContext context) override;
-    /// Refused with status 31.
+    /// Refused with kNotSupported (31).
     boost::shared_ptr<ICIMQualifier> AllocateQualifier(boost::shared_ptr<const ICIMQualifierDecl> decl, const TCIMValue& value,
                                                        TCallContext context) const override;
-    /// Refused with status 31.
+    /// Refused with kNotSupported (31).
     boost::shared_ptr<ICIMQualifier> AllocateQualifier(boost::shared_ptr<const ICIMQualifierDecl> decl, const TCIMValue& value,
                                                        ICIMQualifierDecl::EFlavor flavor, TCallContext context) const override;
     boost::shared_ptr<ICIMQualifier> GetQualifier(const std::string& name, TCallContext context) const override;
-    /// Not offered: status 1; `found` stays as it is.
+    /// Errors: kNotOffered (1), always. `found` stays unchanged.
     boost::shared_ptr<ICIMQualifier> GetQualifier(const std::string& name, bool& found, TCallContext context) const override;
     void EnumerateQualifiers(const boost::function<bool(boost::shared_ptr<ICIMQualifier>)>& callback,
                              TCallContext context) const override;
 
-    /// Does nothing: the wrapped class's instances stay.
+    /// Does nothing. The wrapped class keeps its instances.
     void ClearInstances();
 
-    /// Notes under which object path the instance that a comparison knows as `alias` stands in the compared namespace. An alias
-    /// that is there already keeps its path.
+    /// Notes the object path, in the compared namespace, of an instance that difference records name by `alias`. An alias that
+    /// exists keeps its path.
     void AddObjectPathAlias(std::string alias, const TCIMReference& path);
 
   private:

@@ -13,6 +13,16 @@
 #include "provider/TDeltaClass.h"
 #include "provider/TDeltaNamespaceProvider.h"
 
+// Where a request goes:
+//
+//     instances, queries         to the store, which holds the records
+//     GetClass                   to the store; if the store has no such class, to the compared namespace at "nsIndex"
+//     qualifier declarations     to the compared namespace at "nsIndex"
+//     changes of the schema, enumerations of root classes and providers: refused
+//
+// "nsIndex" is an entry of the call context, and a position in the compare list. Wrappers of classes are cached by position and
+// name, with one map for each entry of the compare list.
+
 namespace NORVZEL20 {
 
 namespace {
@@ -47,7 +57,7 @@ void TDeltaNamespace::AddNamespaceToCompareList(boost::shared_ptr<ICIMNamespace>
     try {
         fClassCache.emplace_back();
     } catch (...) {
-        fCompareList.pop_back();  // both grow, or neither
+        fCompareList.pop_back();  // the two lists must have the same length
         throw;
     }
 }
@@ -74,7 +84,7 @@ unsigned short TDeltaNamespace::GetDiffIndex(TCallContext context) const
     const unsigned short index = entry->second;
     if (index >= NumContainers()) {
         const std::string line = "Bad nsIndex, nsIndex=" + std::to_string(index) + "\n";
-        // Unformatted: what others set of base, width or locale has no say.
+        // Unformatted output: base, width and locale that others have set on the stream do not change the line.
         std::cout.write(line.data(), static_cast<std::streamsize>(line.size())).flush();
         throw TZELException(TZELStatusCode::kNotFound);
     }

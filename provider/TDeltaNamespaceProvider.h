@@ -10,32 +10,33 @@
 
 namespace NORVZEL20 {
 
-/// The provider "delta", which hands out namespaces that compare other namespaces. The order of the virtual operations is part
-/// of the contract.
+/// The provider "delta", which allocates namespaces that compare other namespaces. The order of the virtual operations is part of
+/// the contract.
 ///
-/// Loading the library creates the one provider of the process and registers it with the host; the library lets go of it, and of
-/// its name, in handlers of the process's exit.
-/// Threads: the first call of GetInstance must not overlap another, nor must the first of GetName: they take no lock. The load of
-/// the library makes the first of GetInstance, and a manager that looks at the name the first of GetName. After that any thread at
-/// any time; each operation but AllocateNamespace only reads.
+/// Loading the library creates the one provider of the process and registers it with the host. Provider and name are destroyed by
+/// handlers of the process's exit.
+/// Threads: any, at any time, after the first call of GetInstance and the first call of GetName have returned. These two take no
+/// lock, so no other call may overlap them. The load of the library makes the first call of GetInstance; a manager that reads the
+/// name while it registers the provider makes the first call of GetName. All operations except AllocateNamespace only read.
 class CIMDELTA_EXPORT TDeltaNamespaceProvider : public INamespaceProvider {
   public:
     /// The one provider, made by the first call. Never null.
     static boost::shared_ptr<TDeltaNamespaceProvider> GetInstance();
 
-    /// Registers the provider with the host's provider manager; the load of the library calls it once.
+    /// Registers the provider with the host's provider manager. The load of the library calls it once.
     ///
-    /// Returns status 0 whatever the manager answers. Errors: an exception of the manager; a null manager fails the host's
-    /// assertion.
+    /// Returns kSuccess (0), also if the manager refuses the provider. Errors: the exceptions of the manager; a null manager fails
+    /// the host's assertion.
     static TZELStatusCode Initialize();
 
-    /// "delta"; valid until the handlers of the process's exit run.
+    /// "delta". The text is valid until the handlers of the process's exit run.
     const std::string& GetName(TCallContext context) const override;
 
-    /// A new delta namespace (a TDeltaNamespace) with the delta schema loaded and nothing to compare. The arguments are ignored.
+    /// A new delta namespace (a TDeltaNamespace) with the delta schema loaded and an empty compare list. The arguments are ignored.
     ///
-    /// Each call gives an independent namespace, kept by the shared pointer alone.
-    /// Errors: those of the host's "inmem" provider and populator, such as a missing schema file; nothing is left behind then.
+    /// Each call returns an independent namespace, which only the returned pointer owns.
+    /// Errors: those of the host's "inmem" provider and populator, for example a missing schema file. The new namespace is then
+    /// destroyed.
     boost::shared_ptr<ICIMNamespace> AllocateNamespace(TCallContext context, bool flag, std::string name) const override;
 
     /// 1: the contents are derived from other namespaces.

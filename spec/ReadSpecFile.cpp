@@ -31,7 +31,7 @@ boost::shared_ptr<char> AllocateBuffer(std::size_t size)
     return boost::shared_ptr<char>(buffer, boost::checked_array_deleter<char>());
 }
 
-/// Returns the number of bytes read, which is below `size` where the file has shrunk meanwhile.
+/// Returns the number of bytes read. It is less than `size` if the file has shrunk since its size was read.
 std::size_t ReadFile(const std::string& fileName, char* buffer, std::size_t size)
 {
     std::FILE* const file = std::fopen(fileName.c_str(), "r");
@@ -40,7 +40,7 @@ std::size_t ReadFile(const std::string& fileName, char* buffer, std::size_t size
     }
     const std::size_t length = std::fread(buffer, 1, size, file);
     if (std::ferror(file) != 0) {
-        // The file stays open, as the contract of ReadSpecFile has it.
+        // The file stays open; ReadSpecFile documents it.
         throw TZELException(TZELStatusCode::kFileError);
     }
     std::fclose(file);

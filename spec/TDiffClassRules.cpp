@@ -24,7 +24,7 @@ void TCIMDiffEngine::TDiffClassRules::updateRules(boost::shared_ptr<TDiffClassRu
 void TCIMDiffEngine::TDiffClassRules::excludeKeys(std::string list)
 {
     std::istringstream words(list);
-    words.exceptions(std::ios_base::badbit);  // or a lack of memory would be taken for the end of the list
+    words.exceptions(std::ios_base::badbit);  // otherwise a lack of memory would look like the end of the list
     for (std::string word; words >> word;) {
         fExcludedKeys.push_back(word);
     }

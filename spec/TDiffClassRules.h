@@ -4,18 +4,18 @@
 
 namespace NORVZEL20 {
 
-/// How the instances of one class are compared. A plain record; rules that a ruleset keeps are shared.
+/// How the instances of one class are compared: which properties count, and which keys tell instances apart.
 class TCIMDiffEngine::TDiffClassRules {
   public:
     /// Rules that exclude everything.
     TDiffClassRules();
     TDiffClassRules(propType def, std::map<std::string, propType> props, std::vector<std::string> excludedKeys);
 
-    /// Takes over the default and the listed properties of `other` (not null), whose treatment prevails; properties listed here
-    /// alone stay. Excluded keys are neither taken over nor lost.
+    /// Takes over the default and the listed properties of `other`, which must not be null. If both list a property, `other`
+    /// prevails. The excluded keys stay as they are; those of `other` are not taken over.
     void updateRules(boost::shared_ptr<TDiffClassRules> other);
 
-    /// Adds the names of a list separated by white space. Repeated names are kept.
+    /// Adds the names in `list`, which are separated by white space, to the excluded keys. Repeated names are kept.
     void excludeKeys(std::string list);
 
     bool hasExcludedKeys();
@@ -24,10 +24,10 @@ class TCIMDiffEngine::TDiffClassRules {
     bool isKeyExcluded(const std::string& name);
 
     std::string fClassName;                       ///< set while a specification is read; empty in a ruleset
-    std::map<std::string, propType> fProperties;  ///< the listed properties
-    propType fDefault;                            ///< every other property
-    bool fFinal;                                  ///< the class's own rules are merged; later ones are ignored
-    std::vector<std::string> fExcludedKeys;       ///< keys left out of an instance's identity, in the order read
+    std::map<std::string, propType> fProperties;  ///< the properties listed by name
+    propType fDefault;                            ///< the treatment of all other properties
+    bool fFinal;                                  ///< later rules are ignored (see TRuleset::addToRuleset)
+    std::vector<std::string> fExcludedKeys;       ///< keys by which instances are not matched, in the order read
 };
 
 }  // namespace NORVZEL20

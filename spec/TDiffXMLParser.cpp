@@ -29,7 +29,7 @@ void TCIMDiffEngine::TDiffXMLParser::StartElement(const char* name, std::map<std
 
 void TCIMDiffEngine::TDiffXMLParser::EndElement(const char* name)
 {
-    // Held here, because a state that pops itself would otherwise be destroyed while it runs.
+    // The state pops itself. Without this pointer it would be destroyed while it runs.
     const boost::shared_ptr<TParseState> state = fStateStack.back();
     try {
         std::string element(name);

@@ -13,18 +13,22 @@ namespace NORVZEL20 {
 
 /// Reads a specification into a ruleset. The order of the virtual operations is part of the contract.
 ///
+/// Elements, their attributes and the states that read them:
+///
 ///     DifftoolSpec  (version)                      TStateDTS
 ///       class*      (name, default, excludekeys)   TStateClass
 ///         includelist* | excludelist*              TStateIncludeList, TStateExcludeList
 ///           value*  a property's name              TStateValue
 ///
-/// A stack holds one state for each open element, above TStateStart for the document itself. The state on top takes the next
-/// tag: a start tag that it accepts pushes a state, an end tag pops one. End tags are not compared with what is open. Each class
-/// and property is validated against a schema as it is read. The first error ends the parse and is thrown as TZELException. What
-/// the grammar or the schema does not know is logged twice, once with the detail and once with the tag's line; malformed XML and
-/// any other failure of the schema once. Exceptions of other types pass through unlogged.
+/// A stack holds one state for each open element. TStateStart, for the document itself, is at the bottom. The state on top handles
+/// the next tag: it pushes the state of a child element that it accepts, and pops itself at an end tag. The names of end tags are
+/// not checked. Each class and property is looked up in a schema as it is read.
 ///
-/// For one document; one thread.
+/// The first error ends the parse and is thrown as TZELException. An element, attribute, class or property that the grammar or the
+/// schema does not know is logged twice, first in detail and then with the line of the tag. Malformed XML and any other status of
+/// the schema are logged once. Exceptions of other types pass through unlogged.
+///
+/// Use a parser for one document, from one thread.
 class TCIMDiffEngine::TDiffXMLParser : public TXmlParser {
   public:
     class TParseState;        // spec/TParseState.h
@@ -35,24 +39,24 @@ class TCIMDiffEngine::TDiffXMLParser : public TXmlParser {
     class TStateExcludeList;  // spec/TStateExcludeList.h: in excludelist
     class TStateValue;        // spec/TStateValue.h: in value
 
-    /// A parser without rules, at the start of a document. A null `schema` fails the host's assertion at the first class.
+    /// A parser at the start of a document, without rules. A null `schema` fails the host's assertion at the first class.
     explicit TDiffXMLParser(boost::shared_ptr<ICIMNamespace> schema);
     ~TDiffXMLParser() override;
 
-    /// Hands the tag to the state on top. Errors: status 9 for what the grammar or the schema does not know, any other status of
-    /// the schema; each logged with the line.
+    /// Both pass the tag to the state on top. Errors, which are logged with the line: kParseError (9) if the grammar or the schema
+    /// does not know what the tag names; any other status of the schema.
     void StartElement(const char* name, std::map<std::string, std::string>& attrs) override;
     void EndElement(const char* name) override;
     /// Ignored.
     void processingInstruction(const char* target, const char* data) override;
-    /// Collects `text` up to its first NUL; `length` is not used.
+    /// Appends `text`, up to its first NUL, to the text collected so far. `length` is not used.
     void characters(const char* text, unsigned int length) override;
     /// Ignored.
     void notationDecl(const char* name, const char* publicId, const char* systemId) override;
-    /// Logs the message with the line and throws status 9.
+    /// Logs the message with the line. Errors: kParseError (9), always.
     [[noreturn]] void FatalError(const char* message) override;
 
-    /// The rules of the classes closed so far; the copy shares them.
+    /// The rules of all classes whose end tag was read. The copy shares them with the parser.
     TRuleset getRuleset();
 
   private:
@@ -63,7 +67,7 @@ class TCIMDiffEngine::TDiffXMLParser : public TXmlParser {
     TRuleset fRuleset;
 
   protected:
-    boost::shared_ptr<TDiffClassRules> fCurrentRules;        ///< of the class being read; null before the first
+    boost::shared_ptr<TDiffClassRules> fCurrentRules;  ///< of the class that is read now or was read last; null before the first
     std::deque<boost::shared_ptr<TParseState>> fStateStack;  ///< the states, that of the document first
     std::string fCharData;                                   ///< the text collected since a "value" began or ended
 

@@ -4,6 +4,20 @@
 
 #include "engine/TMessageStream.h"
 
+// A document is read by one state object for each open element. They are on a stack:
+//
+//     (document)     TStateStart
+//     DifftoolSpec   TStateDTS
+//     class          TStateClass
+//     includelist    TStateIncludeList
+//     value          TStateValue         <- top
+//
+// Only the state on top sees a tag. At a start tag it pushes the state of the child, which then reads the attributes. At an end tag
+// it pops itself. There are two exceptions: TStateDTS does not pop itself, because the document ends there; and TStateValue pushes
+// nothing, so the end tag of an element inside a value already ends the value.
+//
+// Every error ends in TDiffXMLParser::FatalError, which logs it with the line and throws.
+
 namespace NORVZEL20 {
 
 TCIMDiffEngine::TDiffXMLParser::TParseState::~TParseState() = default;
@@ -26,6 +40,7 @@ void TCIMDiffEngine::TDiffXMLParser::TParseState::Push(TDiffXMLParser& parser, b
 void TCIMDiffEngine::TDiffXMLParser::TParseState::Unexpected(TDiffXMLParser& parser, const std::string& name)
 {
     parser.FatalError(("Unexpected element " + name).c_str());
+    throw TZELException(TZELStatusCode::kParseError);  // FatalError has thrown; the compiler cannot tell for a virtual call
 }
 
 void TCIMDiffEngine::TDiffXMLParser::TParseState::HandleAttrsOfTop(TDiffXMLParser& parser,
@@ -40,6 +55,7 @@ void TCIMDiffEngine::TDiffXMLParser::TParseState::FailOnLine(TDiffXMLParser& par
     TMessageStream text;
     text << what << parser.GetCurLine() << then << std::endl;
     parser.FatalError(text.str().c_str());
+    throw TZELException(TZELStatusCode::kParseError);  // as in Unexpected
 }
 
 }  // namespace NORVZEL20

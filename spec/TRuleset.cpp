@@ -5,6 +5,17 @@
 #include "host/TAddToVectorCallback.h"
 #include "spec/TDiffClassRules.h"
 
+// How rules reach a class. At the end tag of each "class" element the parser makes two calls:
+//
+//     addToRuleset(cls, rules, true)     the rules of the element itself
+//     updateRuleset(cls, "", schema)     the rules that the class has now, for every class below it, parents first
+//
+// addToRuleset copies the first rules of a class, whichever of the two adds them, and merges later ones into the copy. Merging an
+// element's own rules makes them final. So if a class and its ancestor both have an element, the class keeps its own rules only if
+// the ancestor's element comes first. That is the order for a specification: general classes before special ones.
+//
+// A class without an entry has rules that exclude everything.
+
 namespace NORVZEL20 {
 
 std::string TCIMDiffEngine::strPropType(propType type)

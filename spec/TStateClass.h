@@ -8,9 +8,9 @@ namespace NORVZEL20 {
 class TCIMDiffEngine::TDiffXMLParser::TStateClass : public TCIMDiffEngine::TDiffXMLParser::TParseState {
   public:
     void StartElement(TDiffXMLParser& parser, std::string& name, std::map<std::string, std::string>& attrs) override;
-    /// Adds the rules read to the ruleset, and hands them down to all subclasses.
+    /// Adds the rules to the ruleset, for the class and for all its subclasses in the schema.
     void EndElement(TDiffXMLParser& parser, std::string& name) override;
-    /// Starts new rules; reads "default", "excludekeys" and "name" in this order, then looks the class up in the schema.
+    /// Starts new rules, reads "default", "excludekeys" and "name" in this order, and then looks the class up in the schema.
     void HandleAttrs(TDiffXMLParser& parser, std::map<std::string, std::string>& attrs) override;
 
   private:

@@ -4,7 +4,7 @@
 
 namespace NORVZEL20 {
 
-/// In "excludelist": accepts "value", whose property is to be ignored.
+/// In "excludelist": accepts "value", which names a property to ignore.
 class TCIMDiffEngine::TDiffXMLParser::TStateExcludeList : public TCIMDiffEngine::TDiffXMLParser::TParseState {
   public:
     void StartElement(TDiffXMLParser& parser, std::string& name, std::map<std::string, std::string>& attrs) override;

@@ -4,7 +4,7 @@
 
 namespace NORVZEL20 {
 
-/// In "includelist": accepts "value", whose property is to be compared.
+/// In "includelist": accepts "value", which names a property to compare.
 class TCIMDiffEngine::TDiffXMLParser::TStateIncludeList : public TCIMDiffEngine::TDiffXMLParser::TParseState {
   public:
     void StartElement(TDiffXMLParser& parser, std::string& name, std::map<std::string, std::string>& attrs) override;

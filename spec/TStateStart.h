@@ -4,7 +4,7 @@
 
 namespace NORVZEL20 {
 
-/// Nothing read yet: accepts the root element "DifftoolSpec".
+/// At the start of the document: accepts the root element "DifftoolSpec".
 class TCIMDiffEngine::TDiffXMLParser::TStateStart : public TCIMDiffEngine::TDiffXMLParser::TParseState {
   public:
     void StartElement(TDiffXMLParser& parser, std::string& name, std::map<std::string, std::string>& attrs) override;

@@ -4,13 +4,13 @@
 
 namespace NORVZEL20 {
 
-/// In "value": its text is the name of a property. Elements within are ignored, but their end tag ends the value.
+/// In "value": its text is the name of a property. A start tag within it is ignored, but the matching end tag ends the value.
 class TCIMDiffEngine::TDiffXMLParser::TStateValue : public TCIMDiffEngine::TDiffXMLParser::TParseState {
   public:
-    /// Forgets the text collected so far.
+    /// Discards the text that the parser has collected so far.
     TStateValue(TDiffXMLParser& parser, propType type);
 
-    /// Looks the property up in the schema and lists it; what was listed first in a class stays.
+    /// Looks the property up in the schema and adds it to the rules. If the class lists it already, the first listing stays.
     void EndElement(TDiffXMLParser& parser, std::string& name) override;
 
   private:
