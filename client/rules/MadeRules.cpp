@@ -2,8 +2,7 @@
 
 #include <algorithm>
 
-#include "client/inventory/CimWalk.h"
-#include "client/inventory/OperatingSystem.h"
+#include "client/inventory/CollectObjects.h"
 #include "embedded/value/TValueXml.h"
 #include "host/RootClassName.h"
 #include "provider/DeltaNames.h"
