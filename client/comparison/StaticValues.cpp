@@ -17,8 +17,8 @@ bool DiffersIn(const TInMemNamespace& other, const TInMemClass& cls, TInMemPrope
 bool StaticValuesDiffer(const std::vector<TInventory>& inventories)
 {
     for (const boost::shared_ptr<TInMemClass>& cls : inventories.front().ns->GetClasses()) {
-        for (const std::uint32_t slot : cls->GetSlotOrder()) {
-            const boost::shared_ptr<TInMemPropertyDecl>& decl = cls->GetSharedSlotDecl(slot);
+        for (const std::uint32_t slot : cls->GetLayout().GetOrder()) {
+            const boost::shared_ptr<TInMemPropertyDecl>& decl = cls->GetLayout().GetSharedDecl(slot);
             for (std::size_t other = 1; decl->IsStatic() && other < inventories.size(); ++other) {
                 if (DiffersIn(*inventories[other].ns, *cls, *decl)) {
                     return true;

@@ -79,8 +79,8 @@ std::string FindUndeclaredProperty(const TInventory&, const TInventory& other, T
 std::string FindOtherType(const TInventory& reference, const TInventory& other, TInMemClass& cls, const std::vector<std::string>&)
 {
     const boost::shared_ptr<TInMemClass> there = other.ns->FindClass(cls.GetName());
-    for (const std::uint32_t slot : cls.GetSlotOrder()) {
-        const TInMemPropertyDecl& property = cls.GetSlotDecl(slot);
+    for (const std::uint32_t slot : cls.GetLayout().GetOrder()) {
+        const TInMemPropertyDecl& property = cls.GetLayout().GetDecl(slot);
         const boost::shared_ptr<TInMemPropertyDecl> counterpart = there ? there->FindPropertyDecl(property.GetName()) : nullptr;
         if (counterpart && counterpart->GetType() != property.GetType()) {
             return "property " + property.GetName() + " of class " + cls.GetName() + " is " +

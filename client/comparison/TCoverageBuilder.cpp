@@ -77,9 +77,9 @@ std::vector<std::string> TCoverageBuilder::LeftOut(const std::string& className,
     std::set<std::string, TNameText::TLess> leftOut;
     for (const TInventory& inventory : fInventories) {
         if (const boost::shared_ptr<TInMemClass> cls = inventory.ns->FindClass(className)) {
-            for (const std::uint32_t slot : cls->GetSlotOrder()) {
-                if (taken.count(cls->GetSlotDecl(slot).GetName()) == 0) {
-                    leftOut.insert(cls->GetSlotDecl(slot).GetName());
+            for (const std::uint32_t slot : cls->GetLayout().GetOrder()) {
+                if (taken.count(cls->GetLayout().GetDecl(slot).GetName()) == 0) {
+                    leftOut.insert(cls->GetLayout().GetDecl(slot).GetName());
                 }
             }
         }

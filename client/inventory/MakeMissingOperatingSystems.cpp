@@ -110,7 +110,7 @@ std::string DescribeConflict(const TInMemClass& declared, const TInMemNamespace&
     for (const TInMemClass* cls = &declared; cls != nullptr; cls = cls->GetSuperInMemClass().get()) {
         const boost::shared_ptr<TInMemClass> super =
             cls->GetSuperInMemClass() ? ns.FindClass(cls->GetSuperInMemClass()->GetName()) : nullptr;
-        for (const boost::shared_ptr<TInMemPropertyDecl>& own : cls->GetOwnPropertyDecls()) {
+        for (const boost::shared_ptr<TInMemPropertyDecl>& own : cls->GetLayout().GetOwnDecls()) {
             const boost::shared_ptr<TInMemPropertyDecl> above = super ? super->FindPropertyDecl(own->GetName()) : nullptr;
             if (above && above->GetType() != own->GetType()) {
                 return "property " + own->GetName() + " of " + cls->GetName() + " is " + TValueText::DescribeType(own->GetType()) +
@@ -206,18 +206,18 @@ void AddInstance(const TInventory& inventory, TInMemClass& cls)
     }
     const TSystem system = ReadStandardInstance(ns);
     const boost::shared_ptr<TInMemInstance> instance = cls.AllocateInMemInstance();
-    for (const std::uint32_t slot : cls.GetKeySlots()) {
-        if (cls.GetSlotDecl(slot).GetType().IsArray()) {
-            Refuse(inventory, "its key " + cls.GetSlotDecl(slot).GetName() + " is an array");
+    for (const std::uint32_t slot : cls.GetLayout().GetKeys()) {
+        if (cls.GetLayout().GetDecl(slot).GetType().IsArray()) {
+            Refuse(inventory, "its key " + cls.GetLayout().GetDecl(slot).GetName() + " is an array");
         }
-        instance->SetSlot(slot, SomeValue(cls.GetSlotDecl(slot).GetType(), cls.GetName()));
+        instance->SetSlot(slot, SomeValue(cls.GetLayout().GetDecl(slot).GetType(), cls.GetName()));
     }
-    const std::uint32_t name = cls.FindSlot(kNameProperty);
-    if (name != TInMemClass::kNoSlot && cls.GetSlotDecl(name).GetType() == TCIMValue::TCIMType::kString) {
+    const std::uint32_t name = cls.GetLayout().FindSlot(kNameProperty);
+    if (name != TInMemLayout::kNoSlot && cls.GetLayout().GetDecl(name).GetType() == TCIMValue::TCIMType::kString) {
         instance->SetSlot(name, system.name);
     }
-    const std::uint32_t type = cls.FindSlot(kOperatingSystemType);
-    if (cls.GetSlotDecl(type).GetType() == TCIMValue::TCIMType::kUint16) {
+    const std::uint32_t type = cls.GetLayout().FindSlot(kOperatingSystemType);
+    if (cls.GetLayout().GetDecl(type).GetType() == TCIMValue::TCIMType::kUint16) {
         instance->SetSlot(type, TCIMValue(static_cast<unsigned short>(system.type)));
     }
     instance->AddToNamespace(TCallContext());

@@ -31,8 +31,8 @@ namespace {
 std::vector<std::string> KeysInLowerCase(const TInMemClass& cls)
 {
     std::vector<std::string> keys;
-    for (const std::uint32_t slot : cls.GetKeySlots()) {
-        keys.push_back(TNameText::ToLower(cls.GetSlotDecl(slot).GetName()));
+    for (const std::uint32_t slot : cls.GetLayout().GetKeys()) {
+        keys.push_back(TNameText::ToLower(cls.GetLayout().GetDecl(slot).GetName()));
     }
     std::sort(keys.begin(), keys.end());
     return keys;
@@ -95,8 +95,8 @@ void TSchemaCompletion::Spread(std::size_t source, const TInMemClass& cls, std::
             Note(TSchemaNote::kKeysDiffer, target, source, cls.GetName(), std::string());
         }
     }
-    for (const std::uint32_t slot : cls.GetSlotOrder()) {
-        const TInMemPropertyDecl& property = cls.GetSlotDecl(slot);
+    for (const std::uint32_t slot : cls.GetLayout().GetOrder()) {
+        const TInMemPropertyDecl& property = cls.GetLayout().GetDecl(slot);
         const boost::shared_ptr<TInMemPropertyDecl> counterpart = there->FindPropertyDecl(property.GetName());
         if (!counterpart) {
             DeclareProperty(source, property, target, *there);
@@ -142,8 +142,8 @@ void TSchemaCompletion::Respell(std::size_t source, const TInMemClass& cls, std:
     if (copier.RespellClass(cls.GetName())) {
         Note(TSchemaNote::kClassRespelled, target, source, cls.GetName(), std::string(), classBefore);
     }
-    for (const std::uint32_t slot : cls.GetSlotOrder()) {
-        const std::string& name = cls.GetSlotDecl(slot).GetName();
+    for (const std::uint32_t slot : cls.GetLayout().GetOrder()) {
+        const std::string& name = cls.GetLayout().GetDecl(slot).GetName();
         const boost::shared_ptr<TInMemPropertyDecl> counterpart = there->FindPropertyDecl(name);
         const std::string before = counterpart ? counterpart->GetName() : name;
         if (before != name && copier.RespellProperty(*there, name)) {
@@ -174,7 +174,7 @@ void TSchemaCompletion::AdaptReferences()
         }
     }
     for (const std::size_t inventory : changed) {
-        const std::string twice = TReferenceAdapter::AdaptAll(*fInventories[inventory].ns);
+        const std::string twice = TReferenceAdapter::AdaptAndFindDuplicate(*fInventories[inventory].ns);
         if (!twice.empty()) {
             throw TClientError(fInventories[inventory].path + ": has two instances " + twice +
                                " once names are spelled and keys are declared as in the other inventories; remove one of them");

@@ -37,8 +37,8 @@ bool Contains(const std::vector<std::string>& names, const std::string& name)
 std::vector<std::string> PropertyNames(const TInMemClass& cls)
 {
     std::vector<std::string> names;
-    for (const std::uint32_t slot : cls.GetSlotOrder()) {
-        names.push_back(cls.GetSlotDecl(slot).GetName());
+    for (const std::uint32_t slot : cls.GetLayout().GetOrder()) {
+        names.push_back(cls.GetLayout().GetDecl(slot).GetName());
     }
     return names;
 }

@@ -33,17 +33,17 @@ boost::shared_ptr<TInMemClass> TCimXmlClassMaker::Make(const TCimXmlDraft& draft
     for (std::size_t index = 0; index < object.GetProperties().size(); ++index) {
         const TCimXmlContext::TAt at(fContext, draft.propertyPlaces[index]);
         AddProperty(*cls, object.GetProperties()[index], super.get());
-        if (cls->GetSlotOrder().size() > TSchemaLimits::kMaxProperties) {
+        if (cls->GetLayout().GetOrder().size() > TSchemaLimits::kMaxProperties) {
             FailTooMany(TSchemaLimits::kMaxProperties, "properties", object.GetClassName());
         }
     }
     std::size_t methods = 0;
     for (const TInMemClass* above = super.get(); above != nullptr; above = above->GetSuperInMemClass().get()) {
-        methods += above->GetOwnMethodDecls().size();
+        methods += above->GetMethods().GetOwn().size();
     }
     for (const TEmbeddedObject::TMethod& method : object.GetMethods()) {
         AddMethod(*cls, method, super.get());
-        if (methods + cls->GetOwnMethodDecls().size() > TSchemaLimits::kMaxMethods) {
+        if (methods + cls->GetMethods().GetOwn().size() > TSchemaLimits::kMaxMethods) {
             FailTooMany(TSchemaLimits::kMaxMethods, "methods", object.GetClassName());
         }
     }
@@ -89,7 +89,7 @@ void TCimXmlClassMaker::AddProperty(TInMemClass& cls, const TEmbeddedObject::TPr
 void TCimXmlClassMaker::AddMethod(TInMemClass& cls, const TEmbeddedObject::TMethod& method, const TInMemClass* super)
 {
     const boost::shared_ptr<TInMemMethodDecl> inherited =
-        super != nullptr ? super->FindMethodDecl(method.fName) : boost::shared_ptr<TInMemMethodDecl>();
+        super != nullptr ? super->GetMethods().Find(method.fName) : boost::shared_ptr<TInMemMethodDecl>();
     if (inherited && method.fPropagated) {
         return;
     }

@@ -47,14 +47,14 @@ TCimXmlLayout* TCimXmlInstanceBuilder::FindLayout(const char* className)
 TCimXmlTarget TCimXmlInstanceBuilder::FindProperty(const char* name)
 {
     const TInMemClass& cls = *fLayout->cls;
-    const std::vector<std::uint32_t>& order = cls.GetSlotOrder();
-    std::uint32_t slot = TInMemClass::kNoSlot;
-    if (fExpected < order.size() && cls.GetSlotDecl(order[fExpected]).GetName() == name) {
+    const std::vector<std::uint32_t>& order = cls.GetLayout().GetOrder();
+    std::uint32_t slot = TInMemLayout::kNoSlot;
+    if (fExpected < order.size() && cls.GetLayout().GetDecl(order[fExpected]).GetName() == name) {
         slot = order[fExpected];
     } else {
-        slot = cls.FindSlot(name);
+        slot = cls.GetLayout().FindSlot(name);
     }
-    if (slot == TInMemClass::kNoSlot) {
+    if (slot == TInMemLayout::kNoSlot) {
         fContext.Fail(EStatus::kNotFound, "found property " + Quote(name) + ", but class " + Quote(cls.GetName()) +
                                               " declares no such property; add its declaration or correct the name");
     }
@@ -63,7 +63,7 @@ TCimXmlTarget TCimXmlInstanceBuilder::FindProperty(const char* name)
     }
     fLayout->given[slot] = fNumber;
     fExpected = fLayout->positions[slot] + 1;
-    const TInMemPropertyDecl& decl = cls.GetSlotDecl(slot);
+    const TInMemPropertyDecl& decl = cls.GetLayout().GetDecl(slot);
     return {&decl.GetName(), slot, decl.GetType(), fLayout->embedded[slot]};
 }
 
@@ -77,7 +77,7 @@ void TCimXmlInstanceBuilder::SetProperty(const TCimXmlTarget& target, TCIMValue&
         return;
     }
     fLate.NoteReference(fInstance, target.slot, fClasses.CountDeclared());
-    fLayout->isHeld = fLayout->isHeld || fLayout->cls->GetSlotDecl(target.slot).IsKey();
+    fLayout->isHeld = fLayout->isHeld || fLayout->cls->GetLayout().GetDecl(target.slot).IsKey();
 }
 
 TCIMValue TCimXmlInstanceBuilder::Convert(const TCimXmlTarget& target, const TCIMValue& value)
@@ -125,11 +125,11 @@ boost::shared_ptr<TInMemInstance> TCimXmlInstanceBuilder::Take(const TOwnKeys* o
 void TCimXmlInstanceBuilder::FillKeys(const TOwnKeys& keys)
 {
     for (const auto& [name, value] : keys) {
-        const std::uint32_t slot = fLayout->cls->FindSlot(name);
-        if (slot == TInMemClass::kNoSlot || fLayout->given[slot] == fNumber) {
+        const std::uint32_t slot = fLayout->cls->GetLayout().FindSlot(name);
+        if (slot == TInMemLayout::kNoSlot || fLayout->given[slot] == fNumber) {
             continue;
         }
-        const TInMemPropertyDecl& decl = fLayout->cls->GetSlotDecl(slot);
+        const TInMemPropertyDecl& decl = fLayout->cls->GetLayout().GetDecl(slot);
         TCIMValue converted = value;
         TValueText::Convert(value, decl.GetType(), converted);  // if that fails, SetProperty reports it
         TReferenceAdapter(fNamespace).Adapt(converted);         // the name was read before classes in front of it were declared

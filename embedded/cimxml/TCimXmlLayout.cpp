@@ -18,12 +18,12 @@ bool HoldsObjects(const TInMemPropertyDecl& decl)
 }  // namespace
 
 TCimXmlLayout::TCimXmlLayout(boost::shared_ptr<TInMemClass> ofClass)
-    : cls(std::move(ofClass)), positions(cls->GetSlotCount()), given(cls->GetSlotCount())
+    : cls(std::move(ofClass)), positions(cls->GetLayout().GetSlotCount()), given(cls->GetLayout().GetSlotCount())
 {
-    for (std::uint32_t slot = 0; slot < cls->GetSlotCount(); ++slot) {
-        embedded.push_back(HoldsObjects(cls->GetSlotDecl(slot)));
+    for (std::uint32_t slot = 0; slot < cls->GetLayout().GetSlotCount(); ++slot) {
+        embedded.push_back(HoldsObjects(cls->GetLayout().GetDecl(slot)));
     }
-    const std::vector<std::uint32_t>& order = cls->GetSlotOrder();
+    const std::vector<std::uint32_t>& order = cls->GetLayout().GetOrder();
     for (std::uint32_t position = 0; position < order.size(); ++position) {
         positions[order[position]] = position;
     }

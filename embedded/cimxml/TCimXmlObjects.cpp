@@ -68,10 +68,10 @@ TEmbeddedObject::TMethod FromMethodDecl(const ICIMMethodDecl& decl)
 
 void AddOwnElements(TEmbeddedObject& object, const TInMemClass& cls)
 {
-    for (const boost::shared_ptr<TInMemPropertyDecl>& decl : cls.GetOwnPropertyDecls()) {
+    for (const boost::shared_ptr<TInMemPropertyDecl>& decl : cls.GetLayout().GetOwnDecls()) {
         object.AddProperty(FromPropertyDecl(*decl));
     }
-    for (const boost::shared_ptr<TInMemMethodDecl>& decl : cls.GetOwnMethodDecls()) {
+    for (const boost::shared_ptr<TInMemMethodDecl>& decl : cls.GetMethods().GetOwn()) {
         object.AddMethod(FromMethodDecl(*decl));
     }
 }

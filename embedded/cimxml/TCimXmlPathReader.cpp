@@ -114,11 +114,11 @@ void TCimXmlPathReader::FailTooDeep() const
 /// The key that a value without a name belongs to: the class must have exactly one.
 const std::string& TCimXmlPathReader::FindOnlyKey(const TInMemClass* cls) const
 {
-    if (cls == nullptr || cls->GetKeySlots().size() != 1) {
+    if (cls == nullptr || cls->GetLayout().GetKeys().size() != 1) {
         fContext.Fail(EStatus::kParseError, "found a key value without a name, expected it in a <KEYBINDING> that names the key"
                                             " (or a class with one key, declared in front of it)");
     }
-    return cls->GetSlotDecl(cls->GetKeySlots().front()).GetName();
+    return cls->GetLayout().GetDecl(cls->GetLayout().GetKeys().front()).GetName();
 }
 
 boost::shared_ptr<TInMemClass> TCimXmlPathReader::FindClass(const std::string& name)

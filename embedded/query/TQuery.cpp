@@ -27,7 +27,7 @@ using TClasses = std::vector<boost::shared_ptr<TInMemClass>>;
 void RequireProperty(const TClasses& classes, const std::string& name, std::size_t position)
 {
     const bool isDeclared = std::any_of(classes.begin(), classes.end(), [&name](const boost::shared_ptr<TInMemClass>& cls) {
-        return cls->FindSlot(name) != TInMemClass::kNoSlot;
+        return cls->GetLayout().FindSlot(name) != TInMemLayout::kNoSlot;
     });
     if (!isDeclared) {
         throw TQueryError(TZELStatusCode::kNotFound, "class '" + classes[0]->GetName() + "' has no property '" + name + "'",

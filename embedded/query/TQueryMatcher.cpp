@@ -51,8 +51,8 @@ void TQueryMatcher::Bind(const TQueryCondition& condition)
     }
     for (const TQueryOperand& operand : condition.operands) {
         if (!operand.name.empty()) {
-            fSlots.resize(std::max(fSlots.size(), operand.ordinal + 1), TInMemClass::kNoSlot);
-            fSlots[operand.ordinal] = fClass.FindSlot(operand.name);
+            fSlots.resize(std::max(fSlots.size(), operand.ordinal + 1), TInMemLayout::kNoSlot);
+            fSlots[operand.ordinal] = fClass.GetLayout().FindSlot(operand.name);
         }
     }
     if (condition.kind == TQueryCondition::kLike) {
@@ -70,7 +70,7 @@ TType TQueryMatcher::GetType(const TQueryOperand& operand) const
         return operand.literal.GetType();
     }
     const std::uint32_t slot = fSlots[operand.ordinal];
-    return slot == TInMemClass::kNoSlot ? TType(TType::kNone) : fClass.GetSlotDecl(slot).GetType();
+    return slot == TInMemLayout::kNoSlot ? TType(TType::kNone) : fClass.GetLayout().GetDecl(slot).GetType();
 }
 
 void TQueryMatcher::CheckComparison(const TQueryCondition& test) const
@@ -116,7 +116,7 @@ const TCIMValue& TQueryMatcher::GetValue(const TQueryOperand& operand, const TIn
     }
     static const TCIMValue fgNull;
     const std::uint32_t slot = fSlots[operand.ordinal];
-    return slot == TInMemClass::kNoSlot ? fgNull : instance.GetSlotValue(slot);
+    return slot == TInMemLayout::kNoSlot ? fgNull : instance.GetSlotValue(slot);
 }
 
 TQueryMatcher::ETruth TQueryMatcher::Evaluate(const TQueryCondition& condition, const TInMemInstance& instance) const

@@ -89,7 +89,7 @@ void TDeclCopy::CheckTypes(const ICIMClass& source, const TInMemClass& target)
         none);
     source.EnumerateMethodDecls(
         [&](boost::shared_ptr<ICIMMethodDecl> decl) {
-            if (const auto same = target.FindMethodDecl(decl->GetName(none))) {
+            if (const auto same = target.GetMethods().Find(decl->GetName(none))) {
                 RequireSame(same->GetType(), decl->GetType(none));
             }
             return true;

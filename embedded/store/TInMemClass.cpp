@@ -2,9 +2,11 @@
 
 #include <algorithm>
 
+#include "embedded/store/InMemClassChecks.h"
 #include "embedded/store/TDeclCopy.h"
 #include "embedded/store/TInMemExtent.h"
 #include "embedded/store/TInMemNamespace.h"
+#include "embedded/value/EraseLast.h"
 #include "embedded/value/TNameText.h"
 #include "host/RootClassName.h"
 #include "host/TZELException.h"
@@ -24,20 +26,18 @@ boost::shared_ptr<TInMemClass> RequireInMem(const boost::shared_ptr<ICIMClass>& 
 
 }  // namespace
 
-TInMemClass::TInMemClass(const std::string& name) : fName(name) {}
+TInMemClass::TInMemClass(const boost::shared_ptr<TInMemNamespace>& ns, const std::string& name,
+                         boost::shared_ptr<TInMemClass> superClass)
+    : fName(name), fNamespaceName(ns->GetNamespaceName()), fSuper(std::move(superClass)), fNamespace(ns),
+      fLayout(fSuper ? &fSuper->fLayout : nullptr), fMethods(fSuper ? &fSuper->fMethods : nullptr)
+{
+    InheritQualifiers(fSuper ? &fSuper->GetQualifiers() : nullptr);
+}
 
 boost::shared_ptr<TInMemClass> TInMemClass::Create(const boost::shared_ptr<TInMemNamespace>& ns, const std::string& name,
                                                    boost::shared_ptr<TInMemClass> superClass)
 {
-    const boost::shared_ptr<TInMemClass> cls(new TInMemClass(name));
-    cls->fNamespace = ns;
-    cls->fNamespaceName = ns->GetNamespaceName();
-    cls->fSuper = std::move(superClass);
-    if (cls->fSuper) {
-        cls->InheritQualifiers(&cls->fSuper->GetQualifiers());
-        cls->InheritSlots();
-    }
-    return cls;
+    return boost::shared_ptr<TInMemClass>(new TInMemClass(ns, name, std::move(superClass)));
 }
 
 boost::shared_ptr<TInMemNamespace> TInMemClass::RequireNamespace() const
@@ -58,21 +58,24 @@ TInMemExtent& TInMemClass::GetExtent() const
     return *fExtent;
 }
 
-TCIMReference TInMemClass::MakePath() const
+void TInMemClass::Enter(TInMemClass& parent, TInMemExtent& extent)
 {
-    const auto ns = fNamespace.lock();
-    TCIMReference path(ns, std::map<std::string, TCIMValue>());
-    if (!ns) {
-        path.SetNamespaceName(fNamespaceName);
+    if (fLayout.CatchUp()) {
+        fMethods.InheritAll();
     }
-    // A path holds its class as one that can be changed, which it is: it is always made by Create.
-    path.SetClass(boost::const_pointer_cast<TInMemClass>(shared_from_this()));
-    return path;
+    parent.fSubClasses.push_back(weak_from_this());
+    fExtent = &extent;
+}
+
+void TInMemClass::Leave(TInMemClass& parent) noexcept
+{
+    EraseLast(parent.fSubClasses, [this](const boost::weak_ptr<TInMemClass>& weak) { return weak.lock().get() == this; });
+    fExtent = nullptr;
 }
 
 void TInMemClass::Validate(TCallContext) const
 {
-    RequireNamespace()->CheckNew(*this);
+    RequireNamespace()->CheckDeclarable(*this);
 }
 
 void TInMemClass::AddToNamespace(TCallContext)
@@ -98,7 +101,7 @@ void TInMemClass::ModifyClass(boost::shared_ptr<ICIMClass> cls, TCallContext con
         [this, &missing](boost::shared_ptr<ICIMPropertyDecl> decl) {
             if (!FindPropertyDecl(decl->GetName(TCallContext()))) {
                 missing.push_back(TDeclCopy::CopyProperty(*decl));
-                CheckOverrides(*missing.back());
+                CheckTypeFits(*this, *missing.back());
             }
             return true;
         },
@@ -108,7 +111,7 @@ void TInMemClass::ModifyClass(boost::shared_ptr<ICIMClass> cls, TCallContext con
     }
     cls->EnumerateMethodDecls(
         [this](boost::shared_ptr<ICIMMethodDecl> decl) {
-            if (!FindMethodDecl(decl->GetName(TCallContext()))) {
+            if (!fMethods.Find(decl->GetName(TCallContext()))) {
                 AddMethodDecl(TDeclCopy::CopyMethod(*decl));
             }
             return true;
@@ -136,32 +139,17 @@ boost::shared_ptr<ICIMNamespace> TInMemClass::GetNamespace(TCallContext) const
 
 bool TInMemClass::IsAssociation(TCallContext) const
 {
-    return IsAssociation();
+    return GetQualifiers().IsTrueAnywhere("Association");
 }
 
 bool TInMemClass::IsAbstract(TCallContext) const
 {
-    return IsAbstract();
-}
-
-std::size_t TInMemClass::GetInstanceCount() const noexcept
-{
-    return fExtent != nullptr ? fExtent->GetCount() : 0;
-}
-
-bool TInMemClass::IsAbstract() const
-{
     return GetQualifiers().IsOwnTrue("Abstract");  // never inherited, whatever flavor it was written with
-}
-
-bool TInMemClass::IsPseudoClass() const noexcept
-{
-    return fName == kRootClassName;
 }
 
 bool TInMemClass::IsRootClass(TCallContext) const
 {
-    return !fSuper && !IsPseudoClass();
+    return !fSuper && fName != kRootClassName;
 }
 
 boost::shared_ptr<ICIMClass> TInMemClass::GetSuperClass(TCallContext) const
@@ -228,14 +216,9 @@ bool TInMemClass::IsSubclassOf(boost::shared_ptr<const ICIMClass> cls, TCallCont
     return IsSubclassOf(cls->GetName(context));
 }
 
-void TInMemClass::EnumerateKeyNames(const boost::function<bool(const std::string*)>& callback, TCallContext) const
+std::size_t TInMemClass::GetInstanceCount() const noexcept
 {
-    const std::vector<std::uint32_t> slots = fKeySlots;
-    for (const std::uint32_t slot : slots) {
-        if (!callback(&fSlots[slot]->GetName())) {
-            return;
-        }
-    }
+    return fExtent != nullptr ? fExtent->GetCount() : 0;
 }
 
 boost::shared_ptr<TInMemInstance> TInMemClass::AllocateInMemInstance()
@@ -252,7 +235,7 @@ void TInMemClass::EnumerateInstances(const boost::function<bool(boost::shared_pt
                                      TCallContext)
 {
     const auto ns = RequireNamespace();  // held, lest the callback lets go of it
-    if (!IsPseudoClass() && !GetExtent().Enumerate(callback)) {
+    if (fName != kRootClassName && !GetExtent().Enumerate(callback)) {
         return;
     }
     if (!deep) {
@@ -267,7 +250,7 @@ void TInMemClass::EnumerateInstances(const boost::function<bool(boost::shared_pt
 
 TCIMValue TInMemClass::InvokeMethod(const std::string& name, TCallContext&, TCallContext)
 {
-    throw TZELException(FindMethodDecl(name) ? TZELStatusCode::kNotOffered : TZELStatusCode::kNotFound);
+    throw TZELException(fMethods.Find(name) ? TZELStatusCode::kNotOffered : TZELStatusCode::kNotFound);
 }
 
 bool TInMemClass::operator==(ICIMClass& other) const
@@ -339,21 +322,6 @@ bool TInMemClass::RemoveInstance(boost::shared_ptr<ICIMInstance> instance)
 {
     const auto own = boost::dynamic_pointer_cast<TInMemInstance>(instance);
     return own && own->GetInMemClass().get() == this && GetExtent().Remove(*own);
-}
-
-/// Instances are told apart by their keys: none may go while there are any, here or below, that have it because of `decl` alone.
-void TInMemClass::CheckKeyStays(const TInMemPropertyDecl& decl) const
-{
-    const auto check = [&decl](const TInMemClass& cls) {
-        const auto there = cls.FindPropertyDecl(decl.GetName());
-        if (cls.GetInstanceCount() > 0 && there && there->IsKey() && !there->IsKeyWithout(decl)) {
-            throw TZELException(TZELStatusCode::kClassInUse);
-        }
-    };
-    check(*this);
-    for (const auto& cls : GetClassesBelow()) {
-        check(*cls);
-    }
 }
 
 void TInMemClass::SetSpelling(const std::string& name)

@@ -7,11 +7,10 @@
 #include <string_view>
 #include <vector>
 
-#include "embedded/store/THashIndex.h"
 #include "embedded/store/TInMemInstance.h"
-#include "embedded/store/TInMemMethodDecl.h"
+#include "embedded/store/TInMemLayout.h"
+#include "embedded/store/TInMemMethodSet.h"
 #include "embedded/store/TInMemNamedElement.h"
-#include "embedded/store/TInMemPropertyDecl.h"
 #include "host/Export.h"
 #include "host/ICIMClass.h"
 
@@ -22,22 +21,24 @@ class TInMemNamespace;
 
 /// A class of an in-memory namespace.
 ///
-/// Lays out its instances: each property has a slot, inherited ones first; a property that comes later gets the next free slot,
-/// and the slot of a removed one stays unused. Holds its superclass; is held by its namespace, its subclasses, its instances and
-/// the references to it. Where the namespace is gone, its operations work as far as they need none; the others throw status 18.
+/// Keeps the layout of its instances (TInMemLayout), its methods (TInMemMethodSet) and its qualifiers. Holds its superclass; is
+/// held by its namespace, its subclasses, its instances and the references to it. After the namespace is gone, operations that
+/// need it throw kNamespaceGone (18); the others work as before.
+/// A change of properties reaches all classes below. It finds the memory for that first; if that fails, nothing has changed.
 /// Comparison operators compare names without regard to letter case; assignment takes nothing over.
+/// Threads: as the namespace.
 class CIMDELTA_EXPORT TInMemClass final : public TInMemNamedElement<ICIMClass>, public boost::enable_shared_from_this<TInMemClass> {
   public:
-    static constexpr std::uint32_t kNoSlot = 0xffffffff;
-
-    /// A class that is not visible yet; `superClass` null for a top-level class. TInMemNamespace::AllocateInMemClass calls it.
+    /// A class that is not visible yet; `superClass` is null for a top-level class. For TInMemNamespace::AllocateInMemClass, which
+    /// checks the arguments.
     static boost::shared_ptr<TInMemClass> Create(const boost::shared_ptr<TInMemNamespace>& ns, const std::string& name,
                                                  boost::shared_ptr<TInMemClass> superClass);
     TInMemClass(const TInMemClass&) = delete;
 
-    /// Errors: status 12 where the name is taken, 13 where the superclass has got one of its properties with another type, 15 where
-    /// the superclass is not declared, 18 where the namespace is gone.
+    /// Returns if AddToNamespace would succeed. Errors: those of AddToNamespace.
     void Validate(TCallContext context) const override;
+    /// Errors: kAlreadyExists (12) if the name is taken, kTypeMismatch (13) if the superclass has got one of its properties with
+    /// another type, kNotFound (15) if the superclass is not declared, kNamespaceGone (18).
     void AddToNamespace(TCallContext context) override;
     void RemoveFromNamespace(TCallContext context) override;
     void ModifyClass(boost::shared_ptr<ICIMClass> cls, TCallContext context) override;
@@ -56,7 +57,7 @@ class CIMDELTA_EXPORT TInMemClass final : public TInMemNamedElement<ICIMClass>, 
     void EnumerateAssociationClasses(const boost::function<bool(boost::shared_ptr<ICIMClass>)>& callback,
                                      const std::string& resultClass, const std::string& role, TCallContext context) override;
     void EnumerateKeyNames(const boost::function<bool(const std::string*)>& callback, TCallContext context) const override;
-    /// Errors: also status 5 for an empty name, 13 for a value without a type.
+    /// Errors: kInvalidParameter (5) for an empty name, kTypeMismatch (13) for a value without a type.
     boost::shared_ptr<ICIMPropertyDecl> AllocatePropertyDecl(const std::string& name, const TCIMValue& value,
                                                              TCallContext context) override;
     boost::shared_ptr<ICIMPropertyDecl> GetPropertyDecl(const std::string& name, TCallContext context) const override;
@@ -79,27 +80,28 @@ class CIMDELTA_EXPORT TInMemClass final : public TInMemNamedElement<ICIMClass>, 
     bool operator<(ICIMClass& other) const override;
     ICIMClass& operator=(const ICIMClass& other) override;
     TInMemClass& operator=(const TInMemClass& other);
-    /// AddToNamespace of a class that was allocated below this one. Errors: status 5 where it was not.
+    /// AddToNamespace of a class that was allocated below this one. Errors: kInvalidParameter (5) if it was not.
     bool AddChildClass(boost::shared_ptr<ICIMClass> cls) override;
     bool RemoveChildClass(boost::shared_ptr<ICIMClass> cls) override;
-    /// False also where another instance has those keys. Errors: status 5 where it is not of this class, 14, 18.
+    /// False also if another instance has those keys. Errors: kInvalidParameter (5) if it is not of this class, kKeyMissing (14),
+    /// kNotFound (15) if this class is not declared, kNamespaceGone (18).
     bool AddInstance(boost::shared_ptr<ICIMInstance> instance) override;
     bool RemoveInstance(boost::shared_ptr<ICIMInstance> instance) override;
     /// Names an association class beyond those whose references point to this class or an ancestor.
     bool AddAssociationClass(boost::shared_ptr<ICIMClass> cls) override;
     bool RemoveAssociationClass(boost::shared_ptr<ICIMClass> cls) override;
-    /// `decl` must come from AllocatePropertyDecl and be in no class yet, else status 5. One that an ancestor declares is
-    /// overridden by it: status 13 where the types differ. Subclasses get the property too. A key comes last among the keys.
+    /// Subclasses get the property too. A new key comes last among the keys of the class. A property of that name that an ancestor
+    /// declares is overridden.
+    /// Errors: kInvalidParameter (5) if `decl` does not come from AllocatePropertyDecl or is in a class, kTypeMismatch (13) if an
+    /// ancestor or a class below declares the property with another type.
     bool AddPropertyDecl(boost::shared_ptr<ICIMPropertyDecl> decl) override;
-    /// False for an inherited one. Errors: status 19 where this class, or one below, has instances and would lose a key.
+    /// False for an inherited one. Errors: kClassInUse (19) if this class, or one below, has instances and would lose a key.
     bool RemovePropertyDecl(boost::shared_ptr<ICIMPropertyDecl> decl) override;
     bool AddMethodDecl(boost::shared_ptr<ICIMMethodDecl> decl) override;
     bool RemoveMethodDecl(boost::shared_ptr<ICIMMethodDecl> decl) override;
 
-    /// As the operations above, without context.
     const std::string& GetName() const noexcept { return fName; }
-    bool IsAssociation() const { return GetQualifiers().IsTrueAnywhere("Association"); }
-    bool IsAbstract() const;
+    /// Whether that is the name of this class or of an ancestor.
     bool IsSubclassOf(std::string_view name) const noexcept;
     /// Null for a top-level class.
     const boost::shared_ptr<TInMemClass>& GetSuperInMemClass() const noexcept { return fSuper; }
@@ -109,72 +111,47 @@ class CIMDELTA_EXPORT TInMemClass final : public TInMemNamedElement<ICIMClass>, 
     std::vector<boost::shared_ptr<TInMemClass>> GetSubClasses() const;
     /// All classes below this one, each before its own subclasses.
     std::vector<boost::shared_ptr<TInMemClass>> GetClassesBelow() const;
-    /// Null where the namespace is gone.
+    /// Null if the namespace is gone.
     boost::shared_ptr<TInMemNamespace> GetInMemNamespace() const { return fNamespace.lock(); }
     /// The namespace's name, also when it is gone.
     const std::string& GetNamespaceName() const noexcept { return fNamespaceName; }
     /// Whether it is visible in a namespace that lives.
     bool IsDeclared() const noexcept { return fExtent != nullptr; }
-    /// What this class itself declares or overrides, in order.
-    const std::vector<boost::shared_ptr<TInMemPropertyDecl>>& GetOwnPropertyDecls() const noexcept { return fOwn; }
-    const std::vector<boost::shared_ptr<TInMemMethodDecl>>& GetOwnMethodDecls() const noexcept { return fMethods; }
 
-    /// The layout. A slot stays the same as long as the class lives; slots and order of declaration differ.
-    std::uint32_t FindSlot(std::string_view name) const noexcept;  ///< kNoSlot where there is no such property
-    std::uint32_t GetSlotCount() const noexcept { return static_cast<std::uint32_t>(fSlots.size()); }
-    const TInMemPropertyDecl& GetSlotDecl(std::uint32_t slot) const noexcept { return *fSlots[slot]; }
-    const boost::shared_ptr<TInMemPropertyDecl>& GetSharedSlotDecl(std::uint32_t slot) const noexcept { return fSlots[slot]; }
-    /// The slots of all properties in order of declaration, inherited ones first.
-    const std::vector<std::uint32_t>& GetSlotOrder() const noexcept { return fOrder; }
-    /// The slots of the keys, in that order.
-    const std::vector<std::uint32_t>& GetKeySlots() const noexcept { return fKeySlots; }
+    /// The properties, their slots, their order and the keys.
+    const TInMemLayout& GetLayout() const noexcept { return fLayout; }
+    const TInMemMethodSet& GetMethods() const noexcept { return fMethods; }
+    /// The declaration of a property, own or inherited; null if there is none.
+    boost::shared_ptr<TInMemPropertyDecl> FindPropertyDecl(std::string_view name) const { return fLayout.FindDecl(name); }
+    /// Whether AddAssociationClass has named that class.
+    bool IsAssociatedBy(const TInMemClass& association) const noexcept;
 
-    /// Null where there is none, own or inherited.
-    boost::shared_ptr<TInMemPropertyDecl> FindPropertyDecl(std::string_view name) const;
-    boost::shared_ptr<TInMemMethodDecl> FindMethodDecl(std::string_view name) const;
-
+    /// The instances of exactly this class. Errors: kNotFound (15) if it is not declared, kNamespaceGone (18).
+    TInMemExtent& GetExtent() const;
+    /// How many there are; 0 if the class is not declared.
+    std::size_t GetInstanceCount() const noexcept;
     /// A new instance with every property null, one allocation.
     boost::shared_ptr<TInMemInstance> AllocateInMemInstance();
-    /// The number of instances of exactly this class; 0 where it is not declared.
-    std::size_t GetInstanceCount() const noexcept;
 
-    /// Spells the name another way. Errors: status 5 where more than letter case differs.
+    /// Runs `change`, which changes the qualifiers of a property that this class itself declares, and brings this class and those
+    /// below in line. Whatever `change` throws is passed on, and then nothing has changed.
+    void ChangeProperty(const TInMemPropertyDecl& decl, const boost::function<void()>& change);
+    /// Spells the name another way. Errors: kInvalidParameter (5) if more than letter case differs.
     void SetSpelling(const std::string& name);
 
   private:
-    friend class TInMemNamespace;
-    friend class TInMemInstance;
-    friend class TInMemPropertyDecl;
-    friend class TInMemStaging;
+    friend class TInMemNamespace;  // the owner: it alone puts the class in and takes it out
 
-    explicit TInMemClass(const std::string& name);
+    TInMemClass(const boost::shared_ptr<TInMemNamespace>& ns, const std::string& name, boost::shared_ptr<TInMemClass> superClass);
+
+    /// Becomes visible below `parent`, with `extent` to hold its instances. Errors: std::bad_alloc, and then it is not.
+    void Enter(TInMemClass& parent, TInMemExtent& extent);
+    void Leave(TInMemClass& parent) noexcept;
+    void NamespaceGoes() noexcept { fExtent = nullptr; }
 
     boost::shared_ptr<TInMemNamespace> RequireNamespace() const;
-    TInMemExtent& GetExtent() const;
-    TCIMReference MakePath() const;
-    void CheckKeyStays(const TInMemPropertyDecl& decl) const;
-    bool IsPseudoClass() const noexcept;
-
-    boost::shared_ptr<TInMemPropertyDecl> FindOwnDecl(std::string_view name) const;
-    boost::shared_ptr<TInMemMethodDecl> FindOwnMethod(std::string_view name) const;
-    void InheritSlots();
-    void InheritDecl(std::string_view name);
-    void AppendSlot(const boost::shared_ptr<TInMemPropertyDecl>& decl);
-    void TakeIn(const boost::shared_ptr<TInMemPropertyDecl>& decl, std::size_t position);
-    void CheckOverrides(const TInMemPropertyDecl& decl) const;
-    void ReserveSlot();
-    std::vector<boost::shared_ptr<TInMemClass>> PrepareChange();
-    void DeclChanged(const TInMemPropertyDecl& decl, const std::vector<boost::shared_ptr<TInMemClass>>& below);
+    std::vector<boost::shared_ptr<TInMemClass>> GetReservedClassesBelow();
     void MethodChanged(std::string_view name);
-    void UpdateLayout();
-    void UpdateOrder();
-    void UpdateKeys();
-
-    bool RefersTo(const TInMemClass& cls, std::string_view role) const;
-    std::vector<boost::shared_ptr<TInMemClass>> FindAssociationClasses(const std::string& resultClass,
-                                                                       const std::string& role) const;
-    void AddOtherEnds(const TInMemClass& association, const std::string& role, const std::string& resultRole,
-                      const std::string& resultClass, std::vector<boost::shared_ptr<TInMemClass>>& ends) const;
 
     std::string fName;
     std::string fNamespaceName;
@@ -183,14 +160,8 @@ class CIMDELTA_EXPORT TInMemClass final : public TInMemNamedElement<ICIMClass>, 
     TInMemExtent* fExtent = nullptr;  // the namespace's; null while the class is not declared there
     std::vector<boost::weak_ptr<TInMemClass>> fSubClasses;
     std::vector<boost::weak_ptr<TInMemClass>> fAssociations;  // added by AddAssociationClass
-    std::vector<boost::shared_ptr<TInMemPropertyDecl>> fOwn;
-    std::vector<boost::shared_ptr<TInMemMethodDecl>> fMethods;
-    std::vector<boost::shared_ptr<TInMemPropertyDecl>> fSlots;  // that of a removed property keeps its declaration
-    THashIndex fSlotIndex;
-    std::vector<std::uint32_t> fOrder;
-    std::vector<std::uint32_t> fKeySlots;
-    std::uint32_t fLayout = 0;       // counts the changes of slots, order and keys
-    std::uint32_t fSuperLayout = 0;  // the superclass's count when its slots were last taken over
+    TInMemLayout fLayout;
+    TInMemMethodSet fMethods;
 };
 
 }  // namespace NORVZEL20

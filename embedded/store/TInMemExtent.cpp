@@ -1,9 +1,20 @@
+// The instances of a class and the index of their keys.
+//
+// Instances stand in a list in order of insertion. An index finds the position of an instance by the hash of its keys; the keys
+// themselves stay in the instances. The keys that count are those with which an instance was added: if a key property is changed
+// later, the instance remembers the old value and is still found by it.
+//
+// A removed instance leaves a gap in the list, so positions and the index stay as they are. When more than half of the list are
+// gaps, it is closed up, but never while a callback runs through it.
+//
+// When the class gets or loses a key, or the text of a reference in a key changes, all hashes change. They are not computed at once
+// but when the index is next needed (Refresh), so loading a schema change by change costs one pass.
+
 #include "embedded/store/TInMemExtent.h"
 
 #include <limits>
 #include <new>
 
-#include "embedded/store/TInMemClass.h"
 #include "host/TZELException.h"
 
 namespace NORVZEL20 {
@@ -16,7 +27,7 @@ std::uint32_t Mix(std::uint32_t seed, const TCIMValue& key)
     return (seed ^ static_cast<std::uint32_t>(hash ^ (hash >> 32))) * 0x01000193U + 0x9e3779b9U;
 }
 
-/// Keeps the positions from changing while a callback runs.
+/// While one of these lives, a callback runs, and positions in the list must not change.
 class TEnumeration {
   public:
     explicit TEnumeration(unsigned int& count) noexcept : fCount(count) { ++fCount; }
@@ -37,35 +48,35 @@ TInMemExtent::~TInMemExtent()
 
 void TInMemExtent::Add(const boost::shared_ptr<TInMemInstance>& instance)
 {
-    CheckKeys(*instance);
+    CheckKeysAreSet(*instance);
     Refresh();
     if (fInstances.size() == fInstances.capacity()) {
         fInstances.reserve(fInstances.size() + fInstances.size() / 2 + 2);
     }
     fIndex.Reserve(fCount + 1);
-    FillGenerated(*instance);
+    FillGeneratedKeys(*instance);
     const std::uint32_t hash = HashOf(*instance);
-    CheckNew(hash, *instance);
+    CheckKeysAreFree(hash, *instance);
     fIndex.Add(hash, static_cast<std::uint32_t>(fInstances.size()));
     fInstances.push_back(instance);
     instance->SetAdded(hash);
-    CountGenerated(*instance);
+    SkipGenerated(*instance);
     ++fCount;
 }
 
 void TInMemExtent::Check(const TInMemInstance& instance) const
 {
-    CheckKeys(instance);
-    for (const std::uint32_t slot : fClass.GetKeySlots()) {
+    CheckKeysAreSet(instance);
+    for (const std::uint32_t slot : fLayout.GetKeys()) {
         if (instance.GetSlotValue(slot).IsNull()) {
             return;  // a number of its own will be generated
         }
     }
     Refresh();
-    CheckNew(HashOf(instance), instance);
+    CheckKeysAreFree(HashOf(instance), instance);
 }
 
-void TInMemExtent::CheckKeys(const TInMemInstance& instance) const
+void TInMemExtent::CheckKeysAreSet(const TInMemInstance& instance) const
 {
     if (instance.IsAdded()) {
         throw TZELException(TZELStatusCode::kInvalidParameter);
@@ -75,7 +86,7 @@ void TInMemExtent::CheckKeys(const TInMemInstance& instance) const
     }
 }
 
-void TInMemExtent::CheckNew(std::uint32_t hash, const TInMemInstance& instance) const
+void TInMemExtent::CheckKeysAreFree(std::uint32_t hash, const TInMemInstance& instance) const
 {
     const auto isSame = [&](std::uint32_t ordinal) { return HasSameKeys(*fInstances[ordinal], instance); };
     if (fIndex.Find(hash, isSame) != THashIndex::kNone) {
@@ -83,19 +94,19 @@ void TInMemExtent::CheckNew(std::uint32_t hash, const TInMemInstance& instance) 
     }
 }
 
-void TInMemExtent::FillGenerated(TInMemInstance& instance)
+void TInMemExtent::FillGeneratedKeys(TInMemInstance& instance)
 {
-    for (const std::uint32_t slot : fClass.GetKeySlots()) {
+    for (const std::uint32_t slot : fLayout.GetKeys()) {
         if (instance.GetSlotValue(slot).IsNull()) {
             instance.SetSlot(slot, TCIMValue(fNextGenerated));
         }
     }
 }
 
-void TInMemExtent::CountGenerated(const TInMemInstance& instance) noexcept
+void TInMemExtent::SkipGenerated(const TInMemInstance& instance) noexcept
 {
-    for (const std::uint32_t slot : fClass.GetKeySlots()) {
-        if (!fClass.GetSlotDecl(slot).IsGenerated()) {
+    for (const std::uint32_t slot : fLayout.GetKeys()) {
+        if (!fLayout.GetDecl(slot).IsGenerated()) {
             continue;
         }
         const std::uint64_t number = instance.GetSlotValue(slot).GetUnsigned();
@@ -108,7 +119,7 @@ void TInMemExtent::CountGenerated(const TInMemInstance& instance) noexcept
 std::uint32_t TInMemExtent::HashOf(const TInMemInstance& instance) const
 {
     std::uint32_t hash = 0;
-    for (const std::uint32_t slot : fClass.GetKeySlots()) {
+    for (const std::uint32_t slot : fLayout.GetKeys()) {
         hash = Mix(hash, instance.GetAddedKey(slot));
     }
     return hash;
@@ -116,7 +127,7 @@ std::uint32_t TInMemExtent::HashOf(const TInMemInstance& instance) const
 
 bool TInMemExtent::HasSameKeys(const TInMemInstance& a, const TInMemInstance& b) const
 {
-    for (const std::uint32_t slot : fClass.GetKeySlots()) {
+    for (const std::uint32_t slot : fLayout.GetKeys()) {
         if (a.GetAddedKey(slot) != b.GetAddedKey(slot)) {
             return false;
         }
@@ -131,7 +142,7 @@ boost::shared_ptr<TInMemInstance> TInMemExtent::Find(const std::vector<TCIMValue
     for (const TCIMValue& key : keys) {
         hash = Mix(hash, key);
     }
-    const std::vector<std::uint32_t>& slots = fClass.GetKeySlots();
+    const std::vector<std::uint32_t>& slots = fLayout.GetKeys();
     const auto isSame = [&](std::uint32_t ordinal) {
         for (std::size_t at = 0; at < keys.size(); ++at) {
             if (fInstances[ordinal]->GetAddedKey(slots[at]) != keys[at]) {
@@ -147,11 +158,11 @@ boost::shared_ptr<TInMemInstance> TInMemExtent::Find(const std::vector<TCIMValue
 bool TInMemExtent::Remove(const TInMemInstance& instance)
 {
     const auto isIt = [&](std::uint32_t ordinal) { return fInstances[ordinal].get() == &instance; };
-    const std::uint32_t ordinal = fIndex.Find(instance.fKeyHash, isIt);
+    const std::uint32_t ordinal = fIndex.Find(instance.GetKeyHash(), isIt);
     if (ordinal == THashIndex::kNone) {
         return false;
     }
-    fIndex.Remove(instance.fKeyHash, ordinal);
+    fIndex.Remove(instance.GetKeyHash(), ordinal);
     fInstances[ordinal]->SetRemoved();
     fInstances[ordinal].reset();
     --fCount;
@@ -161,7 +172,7 @@ bool TInMemExtent::Remove(const TInMemInstance& instance)
     return true;
 }
 
-/// The instance is gone; where memory is short, the next removal tidies up.
+/// Closes the gaps. If memory is short, they stay until the next removal.
 void TInMemExtent::CompactIfPossible() noexcept
 {
     try {
@@ -177,7 +188,7 @@ void TInMemExtent::Compact()
     std::uint32_t kept = 0;
     for (auto& instance : fInstances) {
         if (instance) {
-            index.Add(instance->fKeyHash, kept);
+            index.Add(instance->GetKeyHash(), kept);
             fInstances[kept++].swap(instance);
         }
     }
@@ -219,7 +230,7 @@ void TInMemExtent::RollBack(const TMark& mark) noexcept
 {
     while (fInstances.size() > mark.size) {
         TInMemInstance& instance = *fInstances.back();
-        fIndex.Remove(instance.fKeyHash, static_cast<std::uint32_t>(fInstances.size() - 1));
+        fIndex.Remove(instance.GetKeyHash(), static_cast<std::uint32_t>(fInstances.size() - 1));
         instance.SetRemoved();
         fInstances.pop_back();
         --fCount;
@@ -229,10 +240,14 @@ void TInMemExtent::RollBack(const TMark& mark) noexcept
 
 void TInMemExtent::Refresh() const
 {
-    if (!fIsStale) {
-        return;
+    if (fIsStale || fKeyVersion != fLayout.GetKeyVersion()) {
+        Reindex();
     }
-    // Hashing may fail, and the instances must not be touched before it has not.
+}
+
+void TInMemExtent::Reindex() const
+{
+    // Computing a hash may fail. Only when all are there do the instances get them; until then the old index is right.
     std::vector<std::uint32_t> hashes(fInstances.size());
     THashIndex index;
     index.Reserve(fCount);
@@ -244,10 +259,11 @@ void TInMemExtent::Refresh() const
     }
     for (std::uint32_t ordinal = 0; ordinal < fInstances.size(); ++ordinal) {
         if (fInstances[ordinal]) {
-            fInstances[ordinal]->fKeyHash = hashes[ordinal];
+            fInstances[ordinal]->SetAdded(hashes[ordinal]);
         }
     }
     fIndex.Swap(index);
+    fKeyVersion = fLayout.GetKeyVersion();
     fIsStale = false;
 }
 

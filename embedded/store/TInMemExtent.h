@@ -7,10 +7,9 @@
 
 #include "embedded/store/THashIndex.h"
 #include "embedded/store/TInMemInstance.h"
+#include "embedded/store/TInMemLayout.h"
 
 namespace NORVZEL20 {
-
-class TInMemClass;
 
 /// The instances of exactly one class, in order of insertion, found by key in constant time.
 ///
@@ -23,22 +22,25 @@ class TInMemExtent {
         std::uint64_t nextGenerated;
     };
 
-    explicit TInMemExtent(const TInMemClass& cls) noexcept : fClass(cls) {}
+    /// `layout` is that of the class, and must outlive this.
+    explicit TInMemExtent(const TInMemLayout& layout) noexcept : fLayout(layout), fKeyVersion(layout.GetKeyVersion()) {}
     TInMemExtent(const TInMemExtent&) = delete;
     TInMemExtent& operator=(const TInMemExtent&) = delete;
     ~TInMemExtent();
 
-    /// Adds `instance`, which must be of this class. Errors: status 12, 14, and 5 where it is in an extent.
+    /// Adds `instance`, which must be of this class. Errors: kAlreadyExists (12) if an instance with the same keys is there,
+    /// kKeyMissing (14), kInvalidParameter (5) if it is in an extent already; nothing is added then.
     void Add(const boost::shared_ptr<TInMemInstance>& instance);
-    /// Returns where Add would succeed. Errors: those of Add.
+    /// Returns if Add would succeed. Errors: those of Add.
     void Check(const TInMemInstance& instance) const;
     /// The instance with these keys (in the order of the class's keys, in their declared types), or null.
     boost::shared_ptr<TInMemInstance> Find(const std::vector<TCIMValue>& keys) const;
-    /// False where it is not there.
+    /// False if it is not there.
     bool Remove(const TInMemInstance& instance);
     void Clear() noexcept;
 
-    /// Calls back until the callback returns false; the result tells whether it never did. Instances added meanwhile are left out.
+    /// Calls back until the callback returns false, and then returns false. Instances may be added and removed meanwhile; those
+    /// added are left out.
     bool Enumerate(const boost::function<bool(boost::shared_ptr<ICIMInstance>)>& callback) const;
     std::size_t GetCount() const noexcept { return fCount; }
 
@@ -46,28 +48,30 @@ class TInMemExtent {
     /// Takes out what was added since; nothing may have been removed since.
     void RollBack(const TMark& mark) noexcept;
 
-    /// To be called after the class's keys, or the texts of its references, have changed. The index is made anew when it is next
-    /// asked for keys, so that any number of changes costs one pass.
-    void KeysChanged() noexcept { fIsStale = true; }
+    /// Call this after the texts of references in keys have changed. The keys are indexed anew when the index is next needed, so
+    /// any number of changes costs one pass.
+    void KeyTextsChanged() noexcept { fIsStale = true; }
 
   private:
     void Refresh() const;
+    void Reindex() const;
     std::uint32_t HashOf(const TInMemInstance& instance) const;
     bool HasSameKeys(const TInMemInstance& a, const TInMemInstance& b) const;
-    void CheckNew(std::uint32_t hash, const TInMemInstance& instance) const;
-    void CheckKeys(const TInMemInstance& instance) const;
-    void FillGenerated(TInMemInstance& instance);
-    void CountGenerated(const TInMemInstance& instance) noexcept;
+    void CheckKeysAreFree(std::uint32_t hash, const TInMemInstance& instance) const;
+    void CheckKeysAreSet(const TInMemInstance& instance) const;
+    void FillGeneratedKeys(TInMemInstance& instance);
+    void SkipGenerated(const TInMemInstance& instance) noexcept;
     void Compact();
     void CompactIfPossible() noexcept;
 
-    const TInMemClass& fClass;
-    std::vector<boost::shared_ptr<TInMemInstance>> fInstances;  // null where one was removed
-    mutable THashIndex fIndex;                                  // by TInMemInstance::fKeyHash, also while it is stale
-    mutable bool fIsStale = false;
+    const TInMemLayout& fLayout;
+    std::vector<boost::shared_ptr<TInMemInstance>> fInstances;  // null in the place of one that was removed
+    mutable THashIndex fIndex;                                  // by TInMemInstance::GetKeyHash, also while it is stale
+    mutable std::uint32_t fKeyVersion;                          // of the layout, when the index was made
+    mutable bool fIsStale = false;                              // for another reason than that
     std::size_t fCount = 0;
     std::uint64_t fNextGenerated = 1;
-    mutable unsigned int fEnumerations = 0;  // in progress; the positions must not change meanwhile
+    mutable unsigned int fEnumerations = 0;  // in progress; positions must not change meanwhile
 };
 
 }  // namespace NORVZEL20

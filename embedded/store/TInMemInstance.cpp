@@ -1,5 +1,19 @@
+// How an instance lies in memory.
+//
+//   [ counts of the shared pointer | TInMemInstance | head | property | property | ... ]
+//
+// All this is one allocation, of the size that the class has slots at that moment, and reading a property follows no pointer but
+// the one to the block. The property in slot n stands at position n of the instance's own block. When the class gets a property
+// later, the instance cannot grow in place, because handles point into it. A late block then holds the slots that are missing; it
+// is made when one of them is first asked for, for all slots that the class has by then. So most instances have none, few have one,
+// and an instance has another only if the class grows again. Late blocks, values before the first MarkChanged and keys that have
+// changed since the instance was added are kept in the extras, which most instances do without.
+
 #include "embedded/store/TInMemInstance.h"
 
+#include <vector>
+
+#include "embedded/store/TInMemBlock.h"
 #include "embedded/store/TInMemClass.h"
 #include "embedded/store/TInMemExtent.h"
 #include "embedded/store/TInMemNamespace.h"
@@ -8,16 +22,28 @@
 
 namespace NORVZEL20 {
 
-/// The head of a block; the properties follow it.
-struct TInMemInstance::TBlock {
-    TInMemInstance* owner;
+namespace {
 
-    TInMemProperty* GetProperties() noexcept { return reinterpret_cast<TInMemProperty*>(this + 1); }
+struct TSlotValue {
+    std::uint32_t slot;
+    TCIMValue value;
 };
+
+const TCIMValue* Find(const std::vector<TSlotValue>& values, std::uint32_t slot) noexcept
+{
+    for (const TSlotValue& entry : values) {
+        if (entry.slot == slot) {
+            return &entry.value;
+        }
+    }
+    return nullptr;
+}
+
+}  // namespace
 
 struct TInMemInstance::TExtras {
     struct TLateBlock {
-        TBlock* block;
+        TInMemBlock* block;
         std::uint32_t first;  ///< the slot of the first property
         std::uint32_t count;
     };
@@ -28,56 +54,28 @@ struct TInMemInstance::TExtras {
     ~TExtras()
     {
         for (const TLateBlock& late : lateBlocks) {
-            DestroyBlock(*late.block, late.count);
+            late.block->Destroy(late.count);
             ::operator delete(late.block);
         }
     }
 
-    std::vector<TLateBlock> lateBlocks;  ///< properties that the class got after the instance was made, in order of slots
+    std::vector<TLateBlock> lateBlocks;  ///< in order of slots
     std::vector<TSlotValue> earlier;     ///< values before the first MarkChanged
-    std::vector<TSlotValue> keys;        ///< keys as added, where they have changed since
+    std::vector<TSlotValue> keys;        ///< keys as added, if they have changed since
 };
 
-std::size_t TInMemInstance::GetBlockSize(std::uint32_t count) noexcept
+TInMemBlock& TInMemInstance::GetOwnBlock() const noexcept
 {
-    return sizeof(TBlock) + count * sizeof(TInMemProperty);
-}
-
-TInMemInstance::TBlock* TInMemInstance::MakeBlock(void* room, TInMemInstance& owner, std::uint32_t first,
-                                                  std::uint32_t count) noexcept
-{
-    TBlock* const block = new (room) TBlock{&owner};
-    for (std::uint32_t position = 0; position < count; ++position) {
-        const std::uint32_t slot = first + position;
-        const TCIMValue null = TCIMValue::Null(owner.fClass->GetSlotDecl(slot).GetType());
-        new (block->GetProperties() + position) TInMemProperty(slot, position, null);
-    }
-    return block;
-}
-
-void TInMemInstance::DestroyBlock(TBlock& block, std::uint32_t count) noexcept
-{
-    for (std::uint32_t position = 0; position < count; ++position) {
-        block.GetProperties()[position].~TInMemProperty();
-    }
-}
-
-TInMemInstance& TInMemInstance::GetOwner(const TInMemProperty* first) noexcept
-{
-    return *(reinterpret_cast<const TBlock*>(first) - 1)->owner;
-}
-
-TInMemInstance::TBlock& TInMemInstance::GetOwnBlock() const noexcept
-{
-    // Properties are changed through an instance that is not: their handles are given out by operations that are const.
-    return *reinterpret_cast<TBlock*>(const_cast<TInMemInstance*>(this) + 1);
+    // Operations that are const give out handles through which properties are changed.
+    return *reinterpret_cast<TInMemBlock*>(const_cast<TInMemInstance*>(this) + 1);
 }
 
 boost::shared_ptr<TInMemInstance> TInMemInstance::Create(boost::shared_ptr<TInMemClass> cls)
 {
     using TAllocator = TPlacedAllocator<TInMemInstance>;
-    const std::uint32_t slots = cls->GetSlotCount();
-    char* const block = static_cast<char*>(::operator new(TAllocator::kPlace + sizeof(TInMemInstance) + GetBlockSize(slots)));
+    const std::uint32_t slots = cls->GetLayout().GetSlotCount();
+    char* const block =
+        static_cast<char*>(::operator new(TAllocator::kPlace + sizeof(TInMemInstance) + TInMemBlock::GetSize(slots)));
     TInMemInstance* const instance = new (block + TAllocator::kPlace) TInMemInstance(std::move(cls), slots);
     const auto destroy = [](TInMemInstance* made) { made->~TInMemInstance(); };
     return boost::shared_ptr<TInMemInstance>(instance, destroy, TAllocator(block));
@@ -86,12 +84,12 @@ boost::shared_ptr<TInMemInstance> TInMemInstance::Create(boost::shared_ptr<TInMe
 TInMemInstance::TInMemInstance(boost::shared_ptr<TInMemClass> cls, std::uint32_t slots) noexcept
     : fClass(std::move(cls)), fSlots(slots & 0x7fffffffU), fAdded(0)
 {
-    MakeBlock(&GetOwnBlock(), *this, 0, slots);
+    TInMemBlock::Make(this + 1, *this, fClass->GetLayout(), 0, slots);
 }
 
 TInMemInstance::~TInMemInstance()
 {
-    DestroyBlock(GetOwnBlock(), fSlots);
+    GetOwnBlock().Destroy(fSlots);
 }
 
 void TInMemInstance::Validate(TCallContext) const
@@ -106,9 +104,15 @@ void TInMemInstance::AddToNamespace(TCallContext)
 
 TCIMReference TInMemInstance::GetReference() const
 {
-    TCIMReference path = fClass->MakePath();
-    for (const std::uint32_t slot : fClass->GetKeySlots()) {
-        path.AddKeyValue(fClass->GetSlotDecl(slot).GetName(), GetAddedKey(slot));
+    const auto ns = fClass->GetInMemNamespace();
+    TCIMReference path(ns, std::map<std::string, TCIMValue>());
+    if (!ns) {
+        path.SetNamespaceName(fClass->GetNamespaceName());
+    }
+    path.SetClass(fClass);
+    const TInMemLayout& layout = fClass->GetLayout();
+    for (const std::uint32_t slot : layout.GetKeys()) {
+        path.AddKeyValue(layout.GetDecl(slot).GetName(), GetAddedKey(slot));
     }
     return path;
 }
@@ -126,7 +130,7 @@ boost::shared_ptr<ICIMClass> TInMemInstance::GetClass(TCallContext) const
 boost::shared_ptr<ICIMProperty> TInMemInstance::GetHandle(std::uint32_t slot,
                                                           const boost::shared_ptr<const TInMemInstance>& self) const
 {
-    const auto& decl = fClass->GetSharedSlotDecl(slot);
+    const auto& decl = fClass->GetLayout().GetSharedDecl(slot);
     if (decl->IsStatic()) {
         return boost::shared_ptr<ICIMProperty>(decl, &decl->GetStaticProperty());
     }
@@ -135,8 +139,8 @@ boost::shared_ptr<ICIMProperty> TInMemInstance::GetHandle(std::uint32_t slot,
 
 boost::shared_ptr<ICIMProperty> TInMemInstance::GetProperty(const std::string& name, TCallContext) const
 {
-    const std::uint32_t slot = fClass->FindSlot(name);
-    if (slot == TInMemClass::kNoSlot) {
+    const std::uint32_t slot = fClass->GetLayout().FindSlot(name);
+    if (slot == TInMemLayout::kNoSlot) {
         throw TZELException(TZELStatusCode::kNotFound);
     }
     return GetHandle(slot, shared_from_this());
@@ -145,7 +149,7 @@ boost::shared_ptr<ICIMProperty> TInMemInstance::GetProperty(const std::string& n
 void TInMemInstance::EnumerateProperties(const boost::function<bool(boost::shared_ptr<ICIMProperty>)>& callback, TCallContext) const
 {
     const auto self = shared_from_this();
-    const std::vector<std::uint32_t>& order = fClass->GetSlotOrder();
+    const std::vector<std::uint32_t>& order = fClass->GetLayout().GetOrder();
     for (std::size_t at = 0; at < order.size(); ++at) {
         if (!callback(GetHandle(order[at], self))) {
             return;
@@ -155,8 +159,8 @@ void TInMemInstance::EnumerateProperties(const boost::function<bool(boost::share
 
 TInMemProperty* TInMemInstance::FindProperty(std::string_view name) const
 {
-    const std::uint32_t slot = fClass->FindSlot(name);
-    if (slot == TInMemClass::kNoSlot || fClass->GetSlotDecl(slot).IsStatic()) {
+    const std::uint32_t slot = fClass->GetLayout().FindSlot(name);
+    if (slot == TInMemLayout::kNoSlot || fClass->GetLayout().GetDecl(slot).IsStatic()) {
         return nullptr;
     }
     return &GetSlotProperty(slot);
@@ -164,34 +168,29 @@ TInMemProperty* TInMemInstance::FindProperty(std::string_view name) const
 
 TInMemProperty& TInMemInstance::GetSlotProperty(std::uint32_t slot) const
 {
-    return slot < fSlots ? GetOwnBlock().GetProperties()[slot] : GetLateProperty(slot);
+    return slot < fSlots ? GetOwnBlock().GetProperty(slot) : GetLateProperty(slot);
 }
 
 const TCIMValue& TInMemInstance::GetSlotValue(std::uint32_t slot) const
 {
-    const auto& decl = fClass->GetSharedSlotDecl(slot);
+    const auto& decl = fClass->GetLayout().GetSharedDecl(slot);
     return decl->IsStatic() ? decl->GetStaticProperty().GetValue() : GetSlotProperty(slot).GetValue();
 }
 
 void TInMemInstance::SetSlot(std::uint32_t slot, TCIMValue value)
 {
-    const auto& decl = fClass->GetSharedSlotDecl(slot);
+    const auto& decl = fClass->GetLayout().GetSharedDecl(slot);
     if (decl->IsStatic()) {
         decl->GetStaticProperty().SetValue(value);
         return;
     }
-    Change(GetSlotProperty(slot), std::move(value));
-}
-
-void TInMemInstance::Rewrite(std::uint32_t slot, TCIMValue value)
-{
-    GetSlotProperty(slot).fValue = fClass->GetSlotDecl(slot).Fit(std::move(value));
+    GetSlotProperty(slot).SetValue(std::move(value));
 }
 
 const std::string* TInMemInstance::FindMissingKey() const
 {
-    for (const std::uint32_t slot : fClass->GetKeySlots()) {
-        const TInMemPropertyDecl& decl = fClass->GetSlotDecl(slot);
+    for (const std::uint32_t slot : fClass->GetLayout().GetKeys()) {
+        const TInMemPropertyDecl& decl = fClass->GetLayout().GetDecl(slot);
         if (!decl.IsGenerated() && GetSlotValue(slot).IsNull()) {
             return &decl.GetName();
         }
@@ -214,56 +213,29 @@ TInMemProperty& TInMemInstance::GetLateProperty(std::uint32_t slot) const
     for (const TExtras::TLateBlock& late : lateBlocks) {
         end = late.first + late.count;
         if (slot < end) {
-            return late.block->GetProperties()[slot - late.first];
+            return late.block->GetProperty(slot - late.first);
         }
     }
     lateBlocks.reserve(lateBlocks.size() + 1);
-    const std::uint32_t count = fClass->GetSlotCount() - end;
-    TBlock* const block = MakeBlock(::operator new(GetBlockSize(count)), const_cast<TInMemInstance&>(*this), end, count);
-    lateBlocks.push_back(TExtras::TLateBlock{block, end, count});
-    return block->GetProperties()[slot - end];
+    const TInMemLayout& layout = fClass->GetLayout();
+    const std::uint32_t count = layout.GetSlotCount() - end;
+    void* const memory = ::operator new(TInMemBlock::GetSize(count));
+    TInMemBlock& block = TInMemBlock::Make(memory, const_cast<TInMemInstance&>(*this), layout, end, count);
+    lateBlocks.push_back(TExtras::TLateBlock{&block, end, count});
+    return block.GetProperty(slot - end);
 }
 
-void TInMemInstance::Change(TInMemProperty& property, TCIMValue value)
-{
-    const TInMemPropertyDecl& decl = fClass->GetSlotDecl(property.fSlot);
-    TCIMValue fitting = decl.Fit(std::move(value));
-    if (fAdded && decl.IsKey()) {
-        RememberKey(property);
-    }
-    property.fValue = std::move(fitting);
-}
-
-void TInMemInstance::MarkChanged(TInMemProperty& property, const TCIMValue& value)
-{
-    if (property.fChanged) {
-        Change(property, value);
-        return;
-    }
-    std::vector<TSlotValue>& earlier = GetExtras().earlier;
-    earlier.reserve(earlier.size() + 1);
-    TSlotValue before{property.fSlot, property.fValue};
-    Change(property, value);
-    earlier.push_back(std::move(before));
-    property.fChanged = 1;
-}
-
-void TInMemInstance::RememberKey(const TInMemProperty& property)
+void TInMemInstance::KeepKey(std::uint32_t slot, const TCIMValue& value)
 {
     std::vector<TSlotValue>& keys = GetExtras().keys;
-    if (!Find(keys, property.fSlot)) {
-        keys.push_back(TSlotValue{property.fSlot, property.fValue});
+    if (!Find(keys, slot)) {
+        keys.push_back(TSlotValue{slot, value});
     }
 }
 
-const TCIMValue* TInMemInstance::Find(const std::vector<TSlotValue>& values, std::uint32_t slot) noexcept
+void TInMemInstance::KeepEarlier(std::uint32_t slot, const TCIMValue& value)
 {
-    for (const TSlotValue& entry : values) {
-        if (entry.slot == slot) {
-            return &entry.value;
-        }
-    }
-    return nullptr;
+    GetExtras().earlier.push_back(TSlotValue{slot, value});
 }
 
 const TCIMValue* TInMemInstance::FindEarlier(std::uint32_t slot) const noexcept

@@ -1,12 +1,10 @@
 #pragma once
 
 #include <boost/smart_ptr/enable_shared_from_this.hpp>
-#include <cstddef>
 #include <cstdint>
 #include <memory>
 #include <string>
 #include <string_view>
-#include <vector>
 
 #include "embedded/store/TInMemProperty.h"
 #include "host/Export.h"
@@ -14,12 +12,14 @@
 
 namespace NORVZEL20 {
 
+class TInMemBlock;
 class TInMemClass;
 
 /// An instance in memory: one block with the shared pointer's counts, the instance and all its properties.
 ///
 /// Made by TInMemClass::AllocateInMemInstance. A property that the class gets later is made when it is first asked for. Handles
-/// stay valid when the instance is deleted and when the namespace goes; AddToNamespace then throws status 18.
+/// stay valid when the instance is deleted and when the namespace goes; AddToNamespace then throws kNamespaceGone (18).
+/// Threads: as the namespace, reading included.
 class CIMDELTA_EXPORT TInMemInstance final : public ICIMInstance, public boost::enable_shared_from_this<TInMemInstance> {
   public:
     /// An instance of `cls` with every property null.
@@ -28,9 +28,10 @@ class CIMDELTA_EXPORT TInMemInstance final : public ICIMInstance, public boost::
     TInMemInstance& operator=(const TInMemInstance&) = delete;
     ~TInMemInstance() override;
 
-    /// Returns where AddToNamespace would succeed. Errors: those of AddToNamespace.
+    /// Returns if AddToNamespace would succeed. Errors: those of AddToNamespace.
     void Validate(TCallContext context) const override;
-    /// Generated keys that are null get the next number of the class first. Errors: also status 5 where it is in a namespace.
+    /// Generated keys that are null get the next number of the class first. Errors: also kInvalidParameter (5) if it is in a
+    /// namespace.
     void AddToNamespace(TCallContext context) override;
     TCIMReference GetReference(TCallContext context) const override;
     boost::shared_ptr<ICIMClass> GetClass(TCallContext context) const override;
@@ -41,60 +42,50 @@ class CIMDELTA_EXPORT TInMemInstance final : public ICIMInstance, public boost::
     /// As the operations above, without context.
     TCIMReference GetReference() const;
     const boost::shared_ptr<TInMemClass>& GetInMemClass() const noexcept { return fClass; }
-    /// The instance's own property of that name; null where the class declares none, and for a static one. Valid while the
-    /// instance lives.
+    /// The instance's own property of that name; null if the class declares none, and for a static one. Valid while the instance
+    /// lives.
     TInMemProperty* FindProperty(std::string_view name) const;
-    /// The property in a slot of the class (see TInMemClass::FindSlot).
+    /// The property in a slot of the class (see TInMemLayout::FindSlot).
     TInMemProperty& GetSlotProperty(std::uint32_t slot) const;
     /// The value in a slot; a static property's too.
     const TCIMValue& GetSlotValue(std::uint32_t slot) const;
-    /// Sets the property in a slot as ICIMProperty::SetValue does, without looking up a name. Errors: status 13.
+    /// Sets the property in a slot as ICIMProperty::SetValue does, without looking up a name. Errors: kTypeMismatch (13).
     void SetSlot(std::uint32_t slot, TCIMValue value);
-    /// Writes the value in a slot in another way that means the same, a key's too; the instance is then found by that. For whoever
-    /// tells the namespace (ReferenceTextsChanged). Not for static properties. Errors: status 13.
-    void Rewrite(std::uint32_t slot, TCIMValue value);
 
     /// Whether it is part of the namespace.
     bool IsAdded() const noexcept { return fAdded != 0; }
-    /// The name of the first key without a value, which keeps the instance from being added; null where there is none.
+    /// The name of the first key without a value, which keeps the instance from being added; null if there is none.
     const std::string* FindMissingKey() const;
+    /// The value of a key as it was when the instance was added, which counts while the instance is in the namespace.
+    const TCIMValue& GetAddedKey(std::uint32_t slot) const;
+    /// The hash of the keys as added.
+    std::uint32_t GetKeyHash() const noexcept { return fKeyHash; }
+
+    /// A property calls this before it changes, if it is a key of an instance that is part of the namespace. The first value kept
+    /// counts until the instance is removed. Errors: std::bad_alloc, and then nothing has changed.
+    void KeepKey(std::uint32_t slot, const TCIMValue& value);
+    /// A property calls this before its first MarkChanged. Errors: std::bad_alloc, and then nothing has changed.
+    void KeepEarlier(std::uint32_t slot, const TCIMValue& value);
+    /// What KeepEarlier has kept for the slot, or null.
+    const TCIMValue* FindEarlier(std::uint32_t slot) const noexcept;
 
   private:
-    friend class TInMemProperty;
-    friend class TInMemExtent;
+    friend class TInMemExtent;  // the owner: it alone says whether the instance is part of the namespace
 
-    struct TBlock;   // a block of properties that knows whose they are
     struct TExtras;  // what few instances have
-    struct TSlotValue {
-        std::uint32_t slot;
-        TCIMValue value;
-    };
-
-    /// Makes `count` properties from slot `first` on in `room`, which has GetBlockSize(count) bytes.
-    static TBlock* MakeBlock(void* room, TInMemInstance& owner, std::uint32_t first, std::uint32_t count) noexcept;
-    static void DestroyBlock(TBlock& block, std::uint32_t count) noexcept;
-    static std::size_t GetBlockSize(std::uint32_t count) noexcept;
-    static TInMemInstance& GetOwner(const TInMemProperty* first) noexcept;
-    static const TCIMValue* Find(const std::vector<TSlotValue>& values, std::uint32_t slot) noexcept;
 
     TInMemInstance(boost::shared_ptr<TInMemClass> cls, std::uint32_t slots) noexcept;
-    TBlock& GetOwnBlock() const noexcept;
+    TInMemBlock& GetOwnBlock() const noexcept;
     boost::shared_ptr<ICIMProperty> GetHandle(std::uint32_t slot, const boost::shared_ptr<const TInMemInstance>& self) const;
     TExtras& GetExtras() const;
     TInMemProperty& GetLateProperty(std::uint32_t slot) const;
-    void Change(TInMemProperty& property, TCIMValue value);
-    void MarkChanged(TInMemProperty& property, const TCIMValue& value);
-    void RememberKey(const TInMemProperty& property);
-    const TCIMValue* FindEarlier(std::uint32_t slot) const noexcept;
-    /// The value of a key as it was when the instance was added.
-    const TCIMValue& GetAddedKey(std::uint32_t slot) const;
     void SetAdded(std::uint32_t keyHash) noexcept;
     void SetRemoved() noexcept;
 
     boost::shared_ptr<TInMemClass> fClass;
     mutable std::unique_ptr<TExtras> fExtras;
-    std::uint32_t fKeyHash = 0;  // of the keys as added
-    std::uint32_t fSlots : 31;   // in the own block, which stands behind the instance
+    std::uint32_t fKeyHash = 0;
+    std::uint32_t fSlots : 31;  // in the own block, which stands behind the instance
     std::uint32_t fAdded : 1;
 };
 

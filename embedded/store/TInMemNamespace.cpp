@@ -23,10 +23,10 @@ boost::shared_ptr<TInMemNamespace> TInMemNamespace::Create(const std::string& na
 TInMemNamespace::~TInMemNamespace()
 {
     for (const auto& cls : fClasses) {
-        cls->fExtent = nullptr;
+        cls->NamespaceGoes();
     }
     fClassesByName.clear();
-    // Subclasses first, so that no chain of superclasses is let go in one step, however long it is.
+    // Subclasses first: each class releases its superclass, and a long line of classes that release each other takes much stack.
     while (!fClasses.empty()) {
         fClasses.pop_back();
     }
@@ -55,7 +55,7 @@ void TInMemNamespace::AddUnderlyingNamespace(boost::shared_ptr<ICIMNamespace>, T
 boost::shared_ptr<TInMemClass> TInMemNamespace::AllocateInMemClass(const std::string& name,
                                                                    boost::shared_ptr<TInMemClass> superClass)
 {
-    const bool isForeign = superClass && superClass->fNamespace.lock().get() != this;
+    const bool isForeign = superClass && superClass->GetInMemNamespace().get() != this;
     if (name.empty() || name == kRootClassName || isForeign) {
         throw TZELException(TZELStatusCode::kInvalidParameter);
     }
@@ -100,19 +100,23 @@ void TInMemNamespace::EnumerateProviders(const boost::function<bool(boost::share
 
 TInMemClass& TInMemNamespace::GetParent(const TInMemClass& cls) const noexcept
 {
-    return cls.fSuper ? *cls.fSuper : *fRoot;
+    return cls.GetSuperInMemClass() ? *cls.GetSuperInMemClass() : *fRoot;
 }
 
-void TInMemNamespace::CheckNew(const TInMemClass& cls) const
+void TInMemNamespace::CheckDeclarable(const TInMemClass& cls) const
 {
     if (FindClass(cls.GetName())) {
         throw TZELException(TZELStatusCode::kAlreadyExists);
     }
-    if (cls.fSuper && !cls.fSuper->IsDeclared()) {
+    const TInMemClass* const superClass = cls.GetSuperInMemClass().get();
+    if (!superClass) {
+        return;
+    }
+    if (!superClass->IsDeclared()) {
         throw TZELException(TZELStatusCode::kNotFound);
     }
-    for (const auto& own : cls.fOwn) {
-        const auto inherited = cls.fSuper ? cls.fSuper->FindPropertyDecl(own->GetName()) : nullptr;
+    for (const auto& own : cls.GetLayout().GetOwnDecls()) {
+        const auto inherited = superClass->FindPropertyDecl(own->GetName());
         if (inherited && inherited->GetType() != own->GetType()) {
             throw TZELException(TZELStatusCode::kTypeMismatch);
         }
@@ -121,16 +125,11 @@ void TInMemNamespace::CheckNew(const TInMemClass& cls) const
 
 void TInMemNamespace::Declare(const boost::shared_ptr<TInMemClass>& cls)
 {
-    CheckNew(*cls);
-    if (cls->fSuper && cls->fSuper->fLayout != cls->fSuperLayout) {
-        cls->InheritSlots();
-    }
-    std::vector<boost::weak_ptr<TInMemClass>>& siblings = GetParent(*cls).fSubClasses;
-    siblings.push_back(cls);
+    CheckDeclarable(*cls);
+    TEntry entry{cls, std::make_unique<TInMemExtent>(cls->GetLayout())};
+    cls->Enter(GetParent(*cls), *entry.extent);
     try {
         fClasses.push_back(cls);
-        TEntry entry{cls, std::make_unique<TInMemExtent>(*cls)};
-        cls->fExtent = entry.extent.get();
         fClassesByName.emplace(cls->GetName(), std::move(entry));
     } catch (...) {
         Withdraw(*cls);
@@ -141,15 +140,12 @@ void TInMemNamespace::Declare(const boost::shared_ptr<TInMemClass>& cls)
 void TInMemNamespace::Withdraw(TInMemClass& cls) noexcept
 {
     const auto keep = cls.shared_from_this();
-    const auto isIt = [&cls](const boost::weak_ptr<TInMemClass>& weak) { return weak.lock().get() == &cls; };
-    std::vector<boost::weak_ptr<TInMemClass>>& siblings = GetParent(cls).fSubClasses;
-    EraseLast(siblings, isIt);
+    cls.Leave(GetParent(cls));
     EraseLast(fClasses, [&keep](const boost::shared_ptr<TInMemClass>& other) { return other == keep; });
     const auto entry = fClassesByName.find(cls.GetName());
     if (entry != fClassesByName.end() && entry->second.cls == keep) {
         fClassesByName.erase(entry);
     }
-    cls.fExtent = nullptr;
 }
 
 boost::shared_ptr<TInMemQualifierDecl> TInMemNamespace::FindQualifierDecl(std::string_view name) const

@@ -17,9 +17,9 @@ namespace NORVZEL20 {
 
 /// A namespace that holds classes, qualifier declarations and instances in memory.
 ///
-/// Owns its classes and instances; handles that outlive it stay valid (see TInMemClass and TInMemInstance). To load many things and
-/// take them back where one fails, use TInMemStaging. Assignment takes nothing over.
-/// Threads: one at a time for each namespace; different namespaces may be used at once.
+/// Owns its classes and instances; handles that outlive it stay valid (see TInMemClass and TInMemInstance). To load many things,
+/// all or none of them, use TInMemStaging. Assignment takes nothing over. Threads: use a namespace, and everything in it, from one
+/// thread at a time; different namespaces may be used concurrently.
 class CIMDELTA_EXPORT TInMemNamespace final : public ICIMNamespace,
                                               public ILocated,
                                               public boost::enable_shared_from_this<TInMemNamespace> {
@@ -34,7 +34,8 @@ class CIMDELTA_EXPORT TInMemNamespace final : public ICIMNamespace,
     boost::shared_ptr<INamespaceProvider> GetNamespaceProvider(TCallContext context) const override;
     void SetUpcallNamespace(boost::shared_ptr<ICIMNamespace> ns, TCallContext context) override;
     void AddUnderlyingNamespace(boost::shared_ptr<ICIMNamespace> ns, TCallContext context) override;
-    /// `superClass` must be a class of this namespace, else status 5; "<root>" stands for none.
+    /// `superClass` is null or "<root>" for a top-level class. Errors: kInvalidParameter (5) if it is not a class of this
+    /// namespace, and for an empty name and the name "<root>".
     boost::shared_ptr<ICIMClass> AllocateClass(const std::string& name, boost::shared_ptr<ICIMClass> superClass,
                                                TCallContext context) override;
     boost::shared_ptr<ICIMClass> GetClass(const std::string& name, TCallContext context) override;
@@ -47,13 +48,17 @@ class CIMDELTA_EXPORT TInMemNamespace final : public ICIMNamespace,
     boost::shared_ptr<ICIMQualifierDecl> GetQualifierDecl(const std::string& name, TCallContext context) const override;
     void EnumerateQualifierDecls(const boost::function<bool(boost::shared_ptr<ICIMQualifierDecl>)>& callback,
                                  TCallContext context) const override;
-    /// Status 1: there are no indications.
+    /// Throws kNotOffered (1): there are no indications.
     void Subscribe(boost::shared_ptr<ICIMIndicationFilter> filter,
                    const boost::function<bool(boost::shared_ptr<ICIMInstance>)>& callback, TCallContext context) override;
-    /// The path's class and keys count, its namespace and host do not. Key values are converted to the declared types where
-    /// nothing is lost by it, so that a path read from text finds what it names.
+    /// The path's class and keys count, its namespace and host do not. Key values are converted to the declared types if nothing is
+    /// lost by it, so a path read from text finds what it names. Errors: kNotFound (15), kTypeMismatch (13) if a key cannot be
+    /// converted, kKeyMissing (14) if the path lacks one.
     boost::shared_ptr<ICIMInstance> GetInstance(const TCIMReference& path, TCallContext context) const override;
+    /// Errors: those of GetInstance.
     void DeleteInstance(const TCIMReference& path, TCallContext context) override;
+    /// Sets all `properties` or none. Errors: those of GetInstance; also kNotFound (15) if there is no such property, kTypeMismatch
+    /// (13) if a value has another type, kInvalidParameter (5) if a key would change.
     void ModifyInstance(const TCIMReference& path, TCallContext properties, TCallContext context) override;
     /// Answers WQL, with the whole instances (see TQuery). Errors: TQueryError.
     void ExecuteQuery(const boost::function<bool(boost::shared_ptr<ICIMInstance>)>& callback, std::string& language,
@@ -63,26 +68,34 @@ class CIMDELTA_EXPORT TInMemNamespace final : public ICIMNamespace,
     ICIMNamespace& operator=(ICIMNamespace& other) override;
     TInMemNamespace& operator=(const TInMemNamespace& other) = delete;
 
-    /// The class of that name, or null; "<root>" is none of them.
+    /// The class of that name, or null; null for "<root>" too.
     boost::shared_ptr<TInMemClass> FindClass(std::string_view name) const;
     /// As AllocateClass.
     boost::shared_ptr<TInMemClass> AllocateInMemClass(const std::string& name, boost::shared_ptr<TInMemClass> superClass);
     /// All classes in order of declaration, superclasses before their subclasses.
     const std::vector<boost::shared_ptr<TInMemClass>>& GetClasses() const noexcept { return fClasses; }
-    /// Null where there is none.
+    /// Null if there is none.
     boost::shared_ptr<TInMemQualifierDecl> FindQualifierDecl(std::string_view name) const;
     const std::vector<boost::shared_ptr<TInMemQualifierDecl>>& GetQualifierDecls() const noexcept { return fQualifierDecls; }
-    /// Errors: status 12 where one of that name is declared.
+    /// Errors: kAlreadyExists (12) if one of that name is declared.
     void AddQualifierDecl(boost::shared_ptr<TInMemQualifierDecl> decl);
-    /// Finds instances anew by keys that hold references, whose paths change with the spelling of a class and its keys.
-    void ReferenceTextsChanged();
-    /// The instance of that path, or null where there is none or no such class. Errors: status 13, 14.
+    /// Takes out one that AddQualifierDecl has added. Qualifiers made from it stay.
+    void Withdraw(const TInMemQualifierDecl& decl) noexcept;
+    /// The instance of that path; null if there is none or no such class. Errors: kTypeMismatch (13), kKeyMissing (14).
     boost::shared_ptr<TInMemInstance> FindInstance(const TCIMReference& path) const;
+    /// Call this after the text of a reference may have changed, with the spelling of a class or of a key: instances with
+    /// references in their keys are then found by the new text.
+    void ReferenceTextsChanged();
+
+    /// TInMemClass::AddToNamespace and Validate. Errors: see there; nothing has changed then.
+    void Declare(const boost::shared_ptr<TInMemClass>& cls);
+    void CheckDeclarable(const TInMemClass& cls) const;
+    /// Takes out a class that is declared here, with its instances. It must have no subclasses that are declared.
+    void Withdraw(TInMemClass& cls) noexcept;
+    /// The class above `cls`, "<root>" for a top-level class.
+    TInMemClass& GetParent(const TInMemClass& cls) const noexcept;
 
   private:
-    friend class TInMemClass;
-    friend class TInMemStaging;
-
     explicit TInMemNamespace(const std::string& name);
 
     struct TEntry {
@@ -91,12 +104,6 @@ class CIMDELTA_EXPORT TInMemNamespace final : public ICIMNamespace,
     };
 
     boost::shared_ptr<TInMemInstance> RequireInstance(const TCIMReference& path) const;
-    void CheckNew(const TInMemClass& cls) const;
-    void Declare(const boost::shared_ptr<TInMemClass>& cls);
-    void Withdraw(TInMemClass& cls) noexcept;
-    void Withdraw(const TInMemQualifierDecl& decl) noexcept;
-    /// The class above `cls`, "<root>" for a top-level class.
-    TInMemClass& GetParent(const TInMemClass& cls) const noexcept;
 
     std::string fName;
     boost::shared_ptr<TInMemClass> fRoot;  // "<root>": its subclasses are the top-level classes

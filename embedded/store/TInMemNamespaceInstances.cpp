@@ -30,10 +30,11 @@ boost::shared_ptr<TInMemInstance> TInMemNamespace::FindInstance(const TCIMRefere
     if (!cls) {
         return nullptr;
     }
+    const TInMemLayout& layout = cls->GetLayout();
     std::vector<TCIMValue> keys;
-    keys.reserve(cls->GetKeySlots().size());
-    for (const std::uint32_t slot : cls->GetKeySlots()) {
-        keys.push_back(GetKey(path, cls->GetSlotDecl(slot)));
+    keys.reserve(layout.GetKeys().size());
+    for (const std::uint32_t slot : layout.GetKeys()) {
+        keys.push_back(GetKey(path, layout.GetDecl(slot)));
     }
     return path.GetKeyCount() == keys.size() ? cls->GetExtent().Find(keys) : nullptr;
 }
@@ -61,15 +62,15 @@ void TInMemNamespace::DeleteInstance(const TCIMReference& path, TCallContext)
 void TInMemNamespace::ModifyInstance(const TCIMReference& path, TCallContext properties, TCallContext)
 {
     const auto instance = RequireInstance(path);
-    const TInMemClass& cls = *instance->GetInMemClass();
+    const TInMemLayout& layout = instance->GetInMemClass()->GetLayout();
     std::vector<std::pair<std::uint32_t, TCIMValue>> changes;
     for (const auto& [name, value] : properties) {
-        const std::uint32_t slot = cls.FindSlot(name);
-        if (slot == TInMemClass::kNoSlot) {
+        const std::uint32_t slot = layout.FindSlot(name);
+        if (slot == TInMemLayout::kNoSlot) {
             throw TZELException(TZELStatusCode::kNotFound);
         }
-        TCIMValue fitting = cls.GetSlotDecl(slot).Fit(value);
-        if (!cls.GetSlotDecl(slot).IsKey()) {
+        TCIMValue fitting = layout.GetDecl(slot).Fit(value);
+        if (!layout.GetDecl(slot).IsKey()) {
             changes.emplace_back(slot, std::move(fitting));
         } else if (instance->GetSlotValue(slot) != fitting) {
             throw TZELException(TZELStatusCode::kInvalidParameter);
@@ -90,9 +91,10 @@ void TInMemNamespace::ClearInstances()
 void TInMemNamespace::ReferenceTextsChanged()
 {
     for (const auto& cls : fClasses) {
-        for (const std::uint32_t slot : cls->GetKeySlots()) {
-            if (cls->GetSlotDecl(slot).GetType().GetElementType() == TCIMValue::TCIMType::kReference) {
-                cls->GetExtent().KeysChanged();
+        const TInMemLayout& layout = cls->GetLayout();
+        for (const std::uint32_t slot : layout.GetKeys()) {
+            if (layout.GetDecl(slot).GetType().GetElementType() == TCIMValue::TCIMType::kReference) {
+                cls->GetExtent().KeyTextsChanged();
                 break;
             }
         }

@@ -1,5 +1,6 @@
 #include "embedded/store/TInMemProperty.h"
 
+#include "embedded/store/TInMemBlock.h"
 #include "embedded/store/TInMemClass.h"
 #include "embedded/store/TInMemInstance.h"
 
@@ -11,7 +12,7 @@ TInMemProperty::TInMemProperty(std::uint32_t slot, std::uint32_t position, const
 
 TInMemInstance& TInMemProperty::GetInstance() const noexcept
 {
-    return TInMemInstance::GetOwner(this - fPosition);
+    return TInMemBlock::GetOwner(*this, fPosition);
 }
 
 const TCIMValue& TInMemProperty::GetValue(TCallContext) const
@@ -21,7 +22,12 @@ const TCIMValue& TInMemProperty::GetValue(TCallContext) const
 
 void TInMemProperty::SetValue(const TCIMValue& value, TCallContext)
 {
-    GetInstance().Change(*this, value);
+    Change(TCIMValue(value), false);
+}
+
+void TInMemProperty::SetValue(TCIMValue&& value)
+{
+    Change(std::move(value), false);
 }
 
 void TInMemProperty::MarkRemoved()
@@ -31,12 +37,33 @@ void TInMemProperty::MarkRemoved()
 
 void TInMemProperty::MarkChanged(const TCIMValue& value)
 {
-    GetInstance().MarkChanged(*this, value);
+    Change(TCIMValue(value), true);
+}
+
+/// Sets the value, after what may fail: to check the new value, and to keep the old one if it will be asked for.
+void TInMemProperty::Change(TCIMValue&& value, bool isMarked)
+{
+    TInMemInstance& instance = GetInstance();
+    const TInMemPropertyDecl& decl = instance.GetInMemClass()->GetLayout().GetDecl(fSlot);
+    TCIMValue fitting = decl.Fit(std::move(value));
+    if (instance.IsAdded() && decl.IsKey()) {
+        instance.KeepKey(fSlot, fValue);
+    }
+    if (isMarked && !fChanged) {
+        instance.KeepEarlier(fSlot, fValue);
+        fChanged = 1;
+    }
+    fValue = std::move(fitting);
+}
+
+void TInMemProperty::Rewrite(TCIMValue value)
+{
+    fValue = GetInstance().GetInMemClass()->GetLayout().GetDecl(fSlot).Fit(std::move(value));
 }
 
 boost::shared_ptr<const ICIMPropertyDecl> TInMemProperty::GetPropertyDecl(TCallContext) const
 {
-    return GetInstance().GetInMemClass()->GetSharedSlotDecl(fSlot);
+    return GetInstance().GetInMemClass()->GetLayout().GetSharedDecl(fSlot);
 }
 
 const TCIMValue* TInMemProperty::GetEarlierValue() const noexcept

@@ -9,7 +9,7 @@ namespace NORVZEL20 {
 
 class TInMemInstance;
 
-/// One property of an in-memory instance; 32 bytes inside the instance's own block.
+/// One property of an in-memory instance; 32 bytes inside a block of the instance (TInMemBlock).
 ///
 /// Handles are shared pointers into the instance, which they keep alive.
 class CIMDELTA_EXPORT TInMemProperty final : public ICIMProperty {
@@ -25,16 +25,20 @@ class CIMDELTA_EXPORT TInMemProperty final : public ICIMProperty {
     boost::shared_ptr<const ICIMPropertyDecl> GetPropertyDecl(TCallContext context) const override;
 
     const TCIMValue& GetValue() const noexcept { return fValue; }
+    /// Errors: kTypeMismatch (13).
+    void SetValue(TCIMValue&& value);
+    /// Writes the value in another way that means the same. If it is a key, the instance is found by the new value; the caller must
+    /// then call TInMemNamespace::ReferenceTextsChanged. Errors: kTypeMismatch (13).
+    void Rewrite(TCIMValue value);
     bool IsChanged() const noexcept { return fChanged; }
     bool IsRemoved() const noexcept { return fRemoved; }
-    /// What the property held before the first MarkChanged; null where there was none. Valid until another property of the
-    /// instance is changed.
+    /// What the property held before the first MarkChanged; null if there was none. Valid until another property of the instance
+    /// is changed.
     const TCIMValue* GetEarlierValue() const noexcept;
 
   private:
-    friend class TInMemInstance;
-
     TInMemInstance& GetInstance() const noexcept;
+    void Change(TCIMValue&& value, bool isMarked);
 
     TCIMValue fValue;
     std::uint32_t fSlot;           // in the layout of the class

@@ -2,6 +2,7 @@
 
 #include <algorithm>
 
+#include "embedded/store/InMemClassChecks.h"
 #include "embedded/store/TInMemClass.h"
 #include "embedded/value/TNameText.h"
 #include "host/TCIMReference.h"
@@ -19,7 +20,7 @@ TInMemPropertyDecl::TInMemPropertyDecl(const std::string& name, const TCIMValue&
             fDefault = TCIMValue::Null(value.GetType());
         }
     }
-    fStaticProperty.fState.value = fDefault;
+    fStaticProperty.SetState({fDefault, TCIMValue()});
     UpdateMarks();
 }
 
@@ -83,19 +84,21 @@ void TInMemPropertyDecl::SetSpelling(const std::string& name)
 
 void TInMemPropertyDecl::PutQualifier(boost::shared_ptr<ICIMQualifier> qualifier)
 {
-    const auto owner = fOwner.lock();
-    if (owner && TInMemQualifierSet::IsNamed(*qualifier, "Key") && !TInMemQualifierSet::HoldsTrue(*qualifier)) {
-        owner->CheckKeyStays(*this);
+    const auto put = [&] {
+        TInMemNamedElement<ICIMPropertyDecl>::PutQualifier(std::move(qualifier));
+        UpdateMarks();
+    };
+    const auto owner = GetOwner();
+    if (!owner) {
+        put();
+        return;
     }
-    const auto below = owner ? owner->PrepareChange() : std::vector<boost::shared_ptr<TInMemClass>>();
-    TInMemNamedElement<ICIMPropertyDecl>::PutQualifier(std::move(qualifier));
-    UpdateMarks();
-    if (owner) {
-        owner->DeclChanged(*this, below);
+    if (TInMemQualifierSet::IsNamed(*qualifier, "Key") && !TInMemQualifierSet::HoldsTrue(*qualifier)) {
+        CheckKeyStays(*owner, *this);
     }
+    owner->ChangeProperty(*this, put);
 }
 
-/// Whether it would still be a key if `other`, this one or one that it overrides, did not say so.
 bool TInMemPropertyDecl::IsKeyWithout(const TInMemPropertyDecl& other) const
 {
     for (const TInMemPropertyDecl* decl = this; decl; decl = decl->fOverridden.get()) {
@@ -128,7 +131,7 @@ bool TInMemPropertyDecl::IsBagDeclared() const
     return value.IsNull() || value.GetType() != TCIMValue::TCIMType::kString || TNameText::Equal(value.GetString(), "Bag");
 }
 
-void TInMemPropertyDecl::Override(boost::shared_ptr<TInMemPropertyDecl> overridden)
+void TInMemPropertyDecl::SetOverridden(boost::shared_ptr<TInMemPropertyDecl> overridden)
 {
     fOverridden = std::move(overridden);
     InheritQualifiers(fOverridden ? &fOverridden->GetQualifiers() : nullptr);

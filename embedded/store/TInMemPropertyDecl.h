@@ -16,7 +16,7 @@ class TInMemClass;
 /// A property's declaration in an in-memory class.
 ///
 /// Made by TInMemClass::AllocatePropertyDecl, given its qualifiers, then added with TInMemClass::AddPropertyDecl. From then on
-/// AddQualifier throws status 19 where a Key that is not true would take a key away from a class with instances.
+/// AddQualifier throws kClassInUse (19) if a Key that is not true would take a key away from a class with instances.
 class CIMDELTA_EXPORT TInMemPropertyDecl : public TInMemNamedElement<ICIMPropertyDecl>,
                                            public boost::enable_shared_from_this<TInMemPropertyDecl> {
   public:
@@ -31,10 +31,10 @@ class CIMDELTA_EXPORT TInMemPropertyDecl : public TInMemNamedElement<ICIMPropert
     TCIMValue::TCIMType GetType() const noexcept { return fDefault.GetType(); }
     const TCIMValue& GetDefaultValue() const noexcept { return fDefault; }
 
-    /// The class that references point to; empty for other types and where none was named.
+    /// The class that references point to; empty for other types, and if none was named.
     const std::string& GetReferenceClass() const noexcept { return fReferenceClass; }
     void SetReferenceClass(const std::string& name) { fReferenceClass = name; }
-    /// The number of elements of a fixed array; 0 where it is not fixed.
+    /// The number of elements of a fixed array; 0 if it is not fixed.
     unsigned int GetArraySize() const noexcept { return fArraySize; }
     void SetArraySize(unsigned int size) noexcept { fArraySize = size; }
 
@@ -45,33 +45,34 @@ class CIMDELTA_EXPORT TInMemPropertyDecl : public TInMemNamedElement<ICIMPropert
     /// Whether a null is replaced by the next number of the class when an instance is added: a uint64 key with Generated(true).
     bool IsGenerated() const noexcept { return fGenerated; }
 
-    /// The value as the property holds it: nulls typed, bags marked. Errors: status 13 where the type is not the declared one.
+    /// The value as the property holds it: nulls typed, bags marked. Errors: kTypeMismatch (13) if the type is not the declared
+    /// one.
     TCIMValue Fit(TCIMValue value) const;
 
-    /// The value with a stub in the place of each class that a reference in it holds. A class owns its declarations, so that a
-    /// value kept in one of them must not own the class.
+    /// The value with a stub in the place of each class that a reference in it holds. A class owns its declarations; if a value in
+    /// one of them owned the class, neither would ever be released.
     static TCIMValue WithoutClasses(TCIMValue value);
 
-    /// Spells the name another way. Errors: status 5 where more than letter case differs.
+    /// Spells the name another way. Errors: kInvalidParameter (5) if more than letter case differs.
     void SetSpelling(const std::string& name);
 
     /// The declaration of an ancestor that this one overrides, from which it inherits qualifiers; null for none.
     const boost::shared_ptr<TInMemPropertyDecl>& GetOverridden() const noexcept { return fOverridden; }
+    void SetOverridden(boost::shared_ptr<TInMemPropertyDecl> overridden);
+    /// Whether it would still be a key if `other`, this one or one that it overrides, did not say so.
+    bool IsKeyWithout(const TInMemPropertyDecl& other) const;
 
-    /// The class that declares it; null before it is added to one, and where that is gone.
+    /// The class that declares it; null before it is added to one, and if that class is gone.
     boost::shared_ptr<TInMemClass> GetOwner() const { return fOwner.lock(); }
+    void SetOwner(boost::weak_ptr<TInMemClass> owner) noexcept { fOwner.swap(owner); }
 
     /// The one value of a property with the qualifier Static; an ordinary property's is null and of no use.
     TInMemStaticProperty& GetStaticProperty() noexcept { return fStaticProperty; }
 
   private:
-    friend class TInMemClass;
-
     void PutQualifier(boost::shared_ptr<ICIMQualifier> qualifier) override;
     void UpdateMarks();
     bool IsBagDeclared() const;
-    bool IsKeyWithout(const TInMemPropertyDecl& other) const;
-    void Override(boost::shared_ptr<TInMemPropertyDecl> overridden);
 
     std::string fName;
     std::string fReferenceClass;

@@ -1,3 +1,11 @@
+// Loading all or nothing.
+//
+// Things are added to the namespace itself, not to a copy, so that later ones find earlier ones: a class its superclass, a
+// reference its instance. To undo this, the staging notes what it added. For classes and qualifier declarations that is a list. For
+// instances it is one mark for each extent, taken before the first instance goes in: everything behind the mark is new, because
+// nothing is removed meanwhile. Undoing goes backwards: static values, instances, classes with subclasses first, qualifier
+// declarations. None of these steps needs memory, so undoing cannot fail.
+
 #include "embedded/store/TInMemStaging.h"
 
 namespace NORVZEL20 {
@@ -45,7 +53,7 @@ void TInMemStaging::AddClass(const boost::shared_ptr<TInMemClass>& cls)
     }
 }
 
-TInMemExtent& TInMemStaging::Touch(TInMemClass& cls)
+TInMemExtent& TInMemStaging::GetMarkedExtent(TInMemClass& cls)
 {
     TInMemExtent& extent = cls.GetExtent();
     if (&extent != fLast) {
@@ -57,13 +65,14 @@ TInMemExtent& TInMemStaging::Touch(TInMemClass& cls)
 
 void TInMemStaging::AddInstance(const boost::shared_ptr<TInMemInstance>& instance)
 {
-    Touch(*instance->GetInMemClass()).Add(instance);
+    GetMarkedExtent(*instance->GetInMemClass()).Add(instance);
 }
 
 void TInMemStaging::KeepStaticValues(const TInMemClass& cls)
 {
-    for (const std::uint32_t slot : cls.GetSlotOrder()) {
-        const boost::shared_ptr<TInMemPropertyDecl>& decl = cls.GetSharedSlotDecl(slot);
+    const TInMemLayout& layout = cls.GetLayout();
+    for (const std::uint32_t slot : layout.GetOrder()) {
+        const boost::shared_ptr<TInMemPropertyDecl>& decl = layout.GetSharedDecl(slot);
         if (decl->IsStatic()) {
             fStaticValues.emplace(decl.get(), TStaticValue{decl, decl->GetStaticProperty().GetState()});
         }

@@ -12,10 +12,9 @@ namespace NORVZEL20 {
 
 /// Adds many things to a namespace, all of them or none.
 ///
-/// What is added shows at once. Unless Commit is called, the destructor takes everything out again, and the namespace is as it was,
-/// generated numbers included; classes that were there must not be changed, except for static values that it was told to keep, and
-/// nothing removed, while a staging is open.
-/// Threads: as the namespace.
+/// What is added is visible at once. Unless Commit is called, the destructor takes everything out again, and the namespace is as it
+/// was, generated numbers included. While a staging is open, remove nothing and change no class that was there before; static
+/// values may change if KeepStaticValues was called first. Threads: as the namespace.
 class CIMDELTA_INTERNAL_EXPORT TInMemStaging {
   public:
     /// `ns` must not be null.
@@ -24,17 +23,21 @@ class CIMDELTA_INTERNAL_EXPORT TInMemStaging {
     TInMemStaging& operator=(const TInMemStaging&) = delete;
     ~TInMemStaging();
 
-    /// Errors: status 12 where one of that name is declared. After an error of these three the staging may go on.
+    /// The staging may go on after an error of the following three; what failed is not added.
+    /// Errors: kAlreadyExists (12) if one of that name is declared.
     void AddQualifierDecl(const boost::shared_ptr<TInMemQualifierDecl>& decl);
-    /// A class allocated from the namespace, its superclass declared. Errors: status 12, 13, 15.
+    /// Adds a class allocated from the namespace. Errors: kAlreadyExists (12), kTypeMismatch (13), kNotFound (15) if its superclass
+    /// is not declared.
     void AddClass(const boost::shared_ptr<TInMemClass>& cls);
-    /// Errors: status 12 where one with the same keys is there (GetReference then tells its path), 14 where a key is null
-    /// (FindMissingKey then tells its name), 15 where the class is not declared.
+    /// Errors: kAlreadyExists (12) if one with the same keys is there (TInMemInstance::GetReference gives its path), kKeyMissing
+    /// (14) if a key is null (TInMemInstance::FindMissingKey gives its name), kNotFound (15) if the class is not declared.
     void AddInstance(const boost::shared_ptr<TInMemInstance>& instance);
 
-    /// Keeps the values of the class's static properties as they are now, which filling its instances changes.
+    /// Notes the values of the class's static properties, to be put back unless Commit is called. Call this before the instances of
+    /// a class are filled, because setting a static property of an instance changes it for the class.
     void KeepStaticValues(const TInMemClass& cls);
 
+    /// Keeps everything that was added.
     void Commit() noexcept;
 
   private:
@@ -43,14 +46,14 @@ class CIMDELTA_INTERNAL_EXPORT TInMemStaging {
         TInMemStaticProperty::TState state;
     };
 
-    TInMemExtent& Touch(TInMemClass& cls);
+    TInMemExtent& GetMarkedExtent(TInMemClass& cls);
 
     boost::shared_ptr<TInMemNamespace> fNamespace;
     std::vector<boost::shared_ptr<TInMemQualifierDecl>> fQualifierDecls;
     std::vector<boost::shared_ptr<TInMemClass>> fClasses;
-    std::unordered_map<TInMemExtent*, TInMemExtent::TMark> fExtents;            // those that got instances, as they were before
+    std::unordered_map<TInMemExtent*, TInMemExtent::TMark> fExtents;            // marks from before the first instance was added
     std::unordered_map<const TInMemPropertyDecl*, TStaticValue> fStaticValues;  // as they were before
-    TInMemExtent* fLast = nullptr;                                              // the extent of the last instance
+    TInMemExtent* fLast = nullptr;                                              // the one used last, which is in fExtents
     bool fCommitted = false;
 };
 

@@ -7,9 +7,9 @@ namespace NORVZEL20 {
 
 class TInMemPropertyDecl;
 
-/// The value of a static property, one for the class, its subclasses and all their instances. Lives in its declaration.
+/// The value of a static property, which the class, its subclasses and all their instances share. Lives in its declaration.
 ///
-/// Its marks and its earlier value are one for all of them, too.
+/// Its marks and its earlier value are shared too.
 class CIMDELTA_EXPORT TInMemStaticProperty : public ICIMProperty {
   public:
     /// All that changes.
@@ -34,15 +34,13 @@ class CIMDELTA_EXPORT TInMemStaticProperty : public ICIMProperty {
     void SetValue(const TCIMValue& value);
     bool IsChanged() const noexcept { return fState.isChanged; }
     bool IsRemoved() const noexcept { return fState.isRemoved; }
-    /// What it held before the first MarkChanged; null where there was none.
+    /// What it held before the first MarkChanged; null if there was none.
     const TCIMValue* GetEarlierValue() const noexcept { return fState.isChanged ? &fState.earlier : nullptr; }
 
     const TState& GetState() const noexcept { return fState; }
     void SetState(const TState& state) noexcept { fState = state; }
 
   private:
-    friend class TInMemPropertyDecl;
-
     TInMemPropertyDecl& fDecl;
     TState fState;
 };

@@ -1,3 +1,13 @@
+// Bringing references in line with the classes that they name.
+//
+// A reference holds its class and its keys. One that was read before its class was declared holds a stub of the class, and keys
+// typed as the text suggests: "5" may be a uint64 or a sint8. When the class is there, the reference is made anew, with the class
+// itself and with keys of the declared spelling and type. A key may be a reference, so this goes on inside; arrays and the
+// properties of embedded objects are searched too. A value in which nothing changes is not copied.
+//
+// If a reference that is a key changes, its instance has another path. The index of the extent is renewed afterwards, and two
+// instances may turn out to be the same one: "Slot.Card=5" and "slot.card=5" name one card.
+
 #include "embedded/store/TReferenceAdapter.h"
 
 #include <algorithm>
@@ -16,7 +26,7 @@ using TAccess = TValueAccess;
 using TType = TCIMValue::TCIMType;
 using TKeys = std::vector<std::pair<std::string, TCIMValue>>;
 
-TKeys KeysOf(const TCIMReference& path)
+TKeys GetKeys(const TCIMReference& path)
 {
     TKeys keys;
     path.EnumerateKeyBindings([&keys](std::pair<std::string, TCIMValue> key) {
@@ -26,6 +36,7 @@ TKeys KeysOf(const TCIMReference& path)
     return keys;
 }
 
+/// A path with the namespace and host of `like`.
 TCIMReference MakePath(const TCIMReference& like, const boost::shared_ptr<ICIMClass>& cls, const TKeys& keys)
 {
     TCIMReference path(like.GetNamespace(), std::map<std::string, TCIMValue>());
@@ -43,11 +54,11 @@ TCIMReference MakePath(const TCIMReference& like, const boost::shared_ptr<ICIMCl
 }
 
 /// The slots whose values may hold references, in embedded objects too.
-std::vector<std::uint32_t> SlotsToAdapt(const TInMemClass& cls)
+std::vector<std::uint32_t> FindSlotsToAdapt(const TInMemClass& cls)
 {
     std::vector<std::uint32_t> slots;
-    for (const std::uint32_t slot : cls.GetSlotOrder()) {
-        const TInMemPropertyDecl& decl = cls.GetSlotDecl(slot);
+    for (const std::uint32_t slot : cls.GetLayout().GetOrder()) {
+        const TInMemPropertyDecl& decl = cls.GetLayout().GetDecl(slot);
         const TType::ECIMType type = decl.GetType().GetElementType();
         if (decl.IsStatic()) {
             continue;
@@ -59,31 +70,32 @@ std::vector<std::uint32_t> SlotsToAdapt(const TInMemClass& cls)
     return slots;
 }
 
-std::string FindDouble(TInMemClass& cls)
+/// The path that two instances of the class have, or an empty text.
+std::string FindDuplicate(TInMemClass& cls)
 {
     std::unordered_set<std::string> paths;
-    std::string twice;
+    std::string duplicate;
     cls.EnumerateInstances(
         [&](boost::shared_ptr<ICIMInstance> instance) {
             std::string path = instance->GetReference(TCallContext()).GetPath();
             if (!paths.insert(path).second) {
-                twice = std::move(path);
+                duplicate = std::move(path);
             }
-            return twice.empty();
+            return duplicate.empty();
         },
         false, TCallContext());
-    return twice;
+    return duplicate;
 }
 
 }  // namespace
 
 const TInMemPropertyDecl* TReferenceAdapter::AdaptKey(const TInMemClass& cls, std::string& name, TCIMValue& value)
 {
-    const std::uint32_t slot = cls.FindSlot(name);
-    if (slot == TInMemClass::kNoSlot) {
+    const std::uint32_t slot = cls.GetLayout().FindSlot(name);
+    if (slot == TInMemLayout::kNoSlot) {
         return nullptr;
     }
-    const TInMemPropertyDecl& decl = cls.GetSlotDecl(slot);
+    const TInMemPropertyDecl& decl = cls.GetLayout().GetDecl(slot);
     name = decl.GetName();
     TCIMValue adapted;
     if (value.GetType() != decl.GetType() && TValueText::Convert(value, decl.GetType(), adapted)) {
@@ -111,22 +123,22 @@ bool TReferenceAdapter::AdaptPath(TCIMValue& value) const
 {
     const TCIMReference path = value;
     const boost::shared_ptr<TInMemClass> cls = fNamespace.FindClass(path.GetClassName());
-    bool isOther = cls && path.GetClass() != cls;
-    TKeys keys = KeysOf(path);
+    bool isChanged = cls && path.GetClass() != cls;
+    TKeys keys = GetKeys(path);
     for (auto& [name, key] : keys) {
-        isOther = Adapt(key) || isOther;
+        isChanged = Adapt(key) || isChanged;
         if (!cls) {
             continue;
         }
         const std::string nameBefore = name;
         const TCIMValue::TCIMType typeBefore = key.GetType();
         AdaptKey(*cls, name, key);
-        isOther = isOther || name != nameBefore || key.GetType() != typeBefore;
+        isChanged = isChanged || name != nameBefore || key.GetType() != typeBefore;
     }
-    if (isOther) {
+    if (isChanged) {
         value = TCIMValue(MakePath(path, cls ? boost::shared_ptr<ICIMClass>(cls) : path.GetClass(), keys));
     }
-    return isOther;
+    return isChanged;
 }
 
 bool TReferenceAdapter::AdaptElements(TCIMValue& value) const
@@ -138,27 +150,27 @@ bool TReferenceAdapter::AdaptElements(TCIMValue& value) const
     if (std::none_of(stored.begin(), stored.end(), mayRefer)) {
         return false;
     }
-    bool isOther = false;
+    bool isChanged = false;
     std::vector<TCIMValue> elements = stored;
     for (TCIMValue& element : elements) {
-        isOther = Adapt(element) || isOther;
+        isChanged = Adapt(element) || isChanged;
     }
-    if (isOther) {
+    if (isChanged) {
         const TCIMValue adapted(value.GetType(), static_cast<unsigned int>(elements.size()), elements);
         value = value.IsBag() ? adapted.AsBag() : adapted;
     }
-    return isOther;
+    return isChanged;
 }
 
 bool TReferenceAdapter::AdaptObject(TCIMValue& value) const
 {
     const boost::shared_ptr<const TEmbeddedObject> object = value.GetEmbeddedObject();
     std::vector<TEmbeddedObject::TProperty> properties = object->GetProperties();
-    bool isOther = false;
+    bool isChanged = false;
     for (TEmbeddedObject::TProperty& property : properties) {
-        isOther = Adapt(property.fValue) || isOther;
+        isChanged = Adapt(property.fValue) || isChanged;
     }
-    if (!isOther) {
+    if (!isChanged) {
         return false;
     }
     const auto adapted = boost::make_shared<TEmbeddedObject>(object->GetClassName(), object->IsClass());
@@ -176,27 +188,9 @@ bool TReferenceAdapter::AdaptObject(TCIMValue& value) const
     return true;
 }
 
-/// Returns whether a key changed.
-bool TReferenceAdapter::AdaptInstance(TInMemInstance& instance, const std::vector<std::uint32_t>& slots) const
-{
-    bool isKeyOther = false;
-    for (const std::uint32_t slot : slots) {
-        const TCIMValue& stored = instance.GetSlotValue(slot);
-        if (TAccess::IsText(stored) || stored.IsNull()) {
-            continue;
-        }
-        TCIMValue value = stored;
-        if (Adapt(value)) {
-            instance.Rewrite(slot, std::move(value));
-            isKeyOther = isKeyOther || instance.GetInMemClass()->GetSlotDecl(slot).IsKey();
-        }
-    }
-    return isKeyOther;
-}
-
 void TReferenceAdapter::AdaptStatics(const TInMemClass& cls) const
 {
-    for (const boost::shared_ptr<TInMemPropertyDecl>& decl : cls.GetOwnPropertyDecls()) {
+    for (const boost::shared_ptr<TInMemPropertyDecl>& decl : cls.GetLayout().GetOwnDecls()) {
         TCIMValue value = decl->GetStaticProperty().GetValue();
         if (decl->IsStatic() && Adapt(value)) {
             decl->GetStaticProperty().SetValue(value);
@@ -204,33 +198,59 @@ void TReferenceAdapter::AdaptStatics(const TInMemClass& cls) const
     }
 }
 
-std::string TReferenceAdapter::AdaptAll(TInMemNamespace& ns)
+/// Returns whether a key changed.
+bool TReferenceAdapter::AdaptInstance(TInMemInstance& instance, const std::vector<std::uint32_t>& slots) const
 {
-    const TReferenceAdapter adapter(ns);
-    std::vector<boost::shared_ptr<TInMemClass>> withOtherKeys;
-    for (const boost::shared_ptr<TInMemClass>& cls : ns.GetClasses()) {
-        adapter.AdaptStatics(*cls);
-        const std::vector<std::uint32_t> slots = SlotsToAdapt(*cls);
-        bool isKeyOther = false;
-        cls->EnumerateInstances(
-            [&](const boost::shared_ptr<ICIMInstance>& instance) {
-                // The classes of this namespace have instances of this kind alone.
-                isKeyOther = adapter.AdaptInstance(static_cast<TInMemInstance&>(*instance), slots) || isKeyOther;
-                return true;
-            },
-            false, TCallContext());
-        if (isKeyOther) {
-            withOtherKeys.push_back(cls);
+    bool isKeyChanged = false;
+    for (const std::uint32_t slot : slots) {
+        const TCIMValue& stored = instance.GetSlotValue(slot);
+        if (TAccess::IsText(stored) || stored.IsNull()) {
+            continue;
+        }
+        TCIMValue value = stored;
+        if (Adapt(value)) {
+            instance.GetSlotProperty(slot).Rewrite(std::move(value));
+            isKeyChanged = isKeyChanged || instance.GetInMemClass()->GetLayout().GetDecl(slot).IsKey();
         }
     }
-    std::string twice;
-    if (!withOtherKeys.empty()) {
+    return isKeyChanged;
+}
+
+/// Returns whether a key of any instance changed.
+bool TReferenceAdapter::AdaptInstances(TInMemClass& cls) const
+{
+    const std::vector<std::uint32_t> slots = FindSlotsToAdapt(cls);
+    bool isKeyChanged = false;
+    cls.EnumerateInstances(
+        [&](const boost::shared_ptr<ICIMInstance>& instance) {
+            // An in-memory class has in-memory instances only.
+            isKeyChanged = AdaptInstance(static_cast<TInMemInstance&>(*instance), slots) || isKeyChanged;
+            return true;
+        },
+        false, TCallContext());
+    return isKeyChanged;
+}
+
+std::string TReferenceAdapter::AdaptAndFindDuplicate(TInMemNamespace& ns)
+{
+    const TReferenceAdapter adapter(ns);
+    std::vector<boost::shared_ptr<TInMemClass>> withChangedKeys;
+    for (const boost::shared_ptr<TInMemClass>& cls : ns.GetClasses()) {
+        adapter.AdaptStatics(*cls);
+        if (adapter.AdaptInstances(*cls)) {
+            withChangedKeys.push_back(cls);
+        }
+    }
+    if (!withChangedKeys.empty()) {
         ns.ReferenceTextsChanged();
     }
-    for (std::size_t at = 0; at < withOtherKeys.size() && twice.empty(); ++at) {
-        twice = FindDouble(*withOtherKeys[at]);
+    for (const boost::shared_ptr<TInMemClass>& cls : withChangedKeys) {
+        std::string duplicate = FindDuplicate(*cls);
+        if (!duplicate.empty()) {
+            return duplicate;
+        }
     }
-    return twice;
+    return std::string();
 }
 
 }  // namespace NORVZEL20

@@ -52,12 +52,12 @@ boost::shared_ptr<TInMemClass> TSchemaCopier::MakeClass(const TInMemClass& sourc
     CheckHeight(*copy);
     CopyQualifierDecls(source.GetQualifiers(), from.get());
     TDeclCopy::CopyOwnQualifiers(source.GetQualifiers(), *copy);
-    for (const auto& decl : source.GetOwnPropertyDecls()) {
+    for (const auto& decl : source.GetLayout().GetOwnDecls()) {
         CopyQualifierDecls(decl->GetQualifiers(), from.get());
         copy->AddPropertyDecl(TDeclCopy::CopyProperty(*decl));
-        CheckWidth(*copy, copy->GetSlotOrder().size());
+        CheckWidth(*copy, copy->GetLayout().GetOrder().size());
     }
-    for (const auto& method : source.GetOwnMethodDecls()) {
+    for (const auto& method : source.GetMethods().GetOwn()) {
         CopyQualifierDecls(method->GetQualifiers(), from.get());
         copy->AddMethodDecl(TDeclCopy::CopyMethod(*method));
     }
@@ -69,9 +69,9 @@ boost::shared_ptr<TInMemPropertyDecl> TSchemaCopier::CopyPropertyDecl(const TInM
     if (cls.FindPropertyDecl(source.GetName())) {
         return nullptr;
     }
-    CheckWidth(cls, cls.GetSlotOrder().size() + 1);
+    CheckWidth(cls, cls.GetLayout().GetOrder().size() + 1);
     for (const auto& below : cls.GetClassesBelow()) {
-        CheckWidth(*below, below->GetSlotOrder().size() + (below->FindPropertyDecl(source.GetName()) ? 0 : 1));
+        CheckWidth(*below, below->GetLayout().GetOrder().size() + (below->FindPropertyDecl(source.GetName()) ? 0 : 1));
     }
     const auto owner = source.GetOwner();
     const auto from = owner ? owner->GetInMemNamespace() : nullptr;

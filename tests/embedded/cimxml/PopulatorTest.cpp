@@ -177,7 +177,7 @@ TEST_F(PopulatorTest, WhatASuperclassHasIsInheritedIfADocumentRepeatsIt)
         "<VALUE.OBJECT><CLASS NAME=\"B\" SUPERCLASS=\"A\"><PROPERTY NAME=\"S\" TYPE=\"string\" PROPAGATED=\"true\"/>"
         "</CLASS></VALUE.OBJECT>\n";
     fLoading.Load(L::Group(L::Class("A", kPropertyS) + repeating));
-    EXPECT_TRUE(fLoading.GetNamespace()->FindClass("B")->GetOwnPropertyDecls().empty());
+    EXPECT_TRUE(fLoading.GetNamespace()->FindClass("B")->GetLayout().GetOwnDecls().empty());
     EXPECT_EQ("", fLoading.ErrorOf(L::Group(repeating)));
 }
 

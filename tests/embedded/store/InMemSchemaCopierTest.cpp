@@ -38,7 +38,7 @@ TEST_F(InMemSchemaCopierTest, AClassComesWithItsSuperclasses)
     EXPECT_EQ("Big", QualifiersOf(*copy->FindPropertyDecl("Size")));
     EXPECT_EQ("Vendor", QualifiersOf(*copy));
     EXPECT_EQ("Room", copy->FindPropertyDecl("Room")->GetReferenceClass());
-    EXPECT_EQ("Label", copy->FindMethodDecl("Format")->GetParameters().at(0)->GetName());
+    EXPECT_EQ("Label", copy->GetMethods().Find("Format")->GetParameters().at(0)->GetName());
     EXPECT_NE(nullptr, target->FindQualifierDecl("Vendor"));
     EXPECT_EQ(target, copy->GetInMemNamespace());
     EXPECT_NE(disk->FindPropertyDecl("Size"), copy->FindPropertyDecl("Size"));
@@ -73,7 +73,7 @@ TEST_F(InMemSchemaCopierTest, WhatIsJoinedKeepsToTheLimits)
     EXPECT_EQ(0, StatusOf([&] { copier.CopyClass(*below); }));
     below->AddPropertyDecl(Decl({"Own", TType::kUint8, {}}));
     EXPECT_EQ(31, StatusOf([&] { copier.CopyPropertyDecl(*below->FindPropertyDecl("Own"), *target->FindClass("Below")); }));
-    EXPECT_EQ(TSchemaLimits::kMaxProperties, target->FindClass("Below")->GetSlotOrder().size());
+    EXPECT_EQ(TSchemaLimits::kMaxProperties, target->FindClass("Below")->GetLayout().GetOrder().size());
 }
 
 TEST_F(InMemSchemaCopierTest, AConflictOfTypesDeclaresNoClass)
