@@ -23,6 +23,13 @@ void CheckKeyStaysHere(const TInMemClass& cls, const TInMemPropertyDecl& decl)
     }
 }
 
+void RequireSame(TCIMValue::TCIMType a, TCIMValue::TCIMType b)
+{
+    if (a != b) {
+        throw TZELException(TZELStatusCode::kTypeMismatch);
+    }
+}
+
 }  // namespace
 
 void CheckTypeFits(const TInMemClass& cls, const TInMemPropertyDecl& decl)
@@ -39,6 +46,27 @@ void CheckKeyStays(const TInMemClass& cls, const TInMemPropertyDecl& decl)
     for (const auto& below : cls.GetClassesBelow()) {
         CheckKeyStaysHere(*below, decl);
     }
+}
+
+void CheckTypesAgree(const ICIMClass& source, const TInMemClass& target)
+{
+    const TCallContext none;
+    source.EnumeratePropertyDecls(
+        [&](boost::shared_ptr<ICIMPropertyDecl> decl) {
+            if (const auto same = target.FindPropertyDecl(decl->GetName(none))) {
+                RequireSame(same->GetType(), decl->GetType(none));
+            }
+            return true;
+        },
+        none);
+    source.EnumerateMethodDecls(
+        [&](boost::shared_ptr<ICIMMethodDecl> decl) {
+            if (const auto same = target.GetMethods().Find(decl->GetName(none))) {
+                RequireSame(same->GetType(), decl->GetType(none));
+            }
+            return true;
+        },
+        none);
 }
 
 }  // namespace NORVZEL20

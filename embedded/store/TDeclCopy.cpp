@@ -2,9 +2,6 @@
 
 #include <boost/smart_ptr/make_shared.hpp>
 
-#include "embedded/store/TInMemClass.h"
-#include "host/TZELException.h"
-
 namespace NORVZEL20 {
 
 namespace {
@@ -28,13 +25,6 @@ boost::shared_ptr<TInMemParameter> CopyParameter(const TInMemParameter& source)
     return copy;
 }
 
-void RequireSame(TCIMValue::TCIMType a, TCIMValue::TCIMType b)
-{
-    if (a != b) {
-        throw TZELException(TZELStatusCode::kTypeMismatch);
-    }
-}
-
 }  // namespace
 
 boost::shared_ptr<TInMemQualifier> TDeclCopy::CopyQualifier(const ICIMQualifier& source)
@@ -53,6 +43,7 @@ void TDeclCopy::CopyOwnQualifiers(const TInMemQualifierSet& source, ICIMNamedEle
 boost::shared_ptr<TInMemPropertyDecl> TDeclCopy::CopyProperty(const ICIMPropertyDecl& source)
 {
     const TCallContext none;
+    // The default value of a reference may name the class that it points to; the constructor takes it from there.
     auto copy = boost::make_shared<TInMemPropertyDecl>(source.GetName(none), source.GetDefaultValue(none));
     if (const auto* inMem = dynamic_cast<const TInMemPropertyDecl*>(&source)) {
         copy->SetReferenceClass(inMem->GetReferenceClass());
@@ -74,27 +65,6 @@ boost::shared_ptr<TInMemMethodDecl> TDeclCopy::CopyMethod(const ICIMMethodDecl& 
     }
     CopyQualifiers(source, *copy);
     return copy;
-}
-
-void TDeclCopy::CheckTypes(const ICIMClass& source, const TInMemClass& target)
-{
-    const TCallContext none;
-    source.EnumeratePropertyDecls(
-        [&](boost::shared_ptr<ICIMPropertyDecl> decl) {
-            if (const auto same = target.FindPropertyDecl(decl->GetName(none))) {
-                RequireSame(same->GetType(), decl->GetType(none));
-            }
-            return true;
-        },
-        none);
-    source.EnumerateMethodDecls(
-        [&](boost::shared_ptr<ICIMMethodDecl> decl) {
-            if (const auto same = target.GetMethods().Find(decl->GetName(none))) {
-                RequireSame(same->GetType(), decl->GetType(none));
-            }
-            return true;
-        },
-        none);
 }
 
 }  // namespace NORVZEL20

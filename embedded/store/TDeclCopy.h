@@ -10,9 +10,10 @@ namespace NORVZEL20 {
 
 class TInMemClass;
 
-/// Makes in-memory copies of declarations, whatever made the originals; each with all qualifiers that the original shows, inherited
-/// ones included. Beyond what the interfaces tell (class of a reference, sizes, parameters), only in-memory originals have more to
-/// give.
+/// Makes in-memory copies of declarations of any host.
+///
+/// A copy has all qualifiers that the original shows, inherited ones included. The class of a reference, the size of an array and
+/// the parameters of a method are not part of the host's interfaces; they are copied from in-memory originals only.
 class TDeclCopy {
   public:
     TDeclCopy() = delete;
@@ -22,9 +23,6 @@ class TDeclCopy {
     static boost::shared_ptr<TInMemQualifier> CopyQualifier(const ICIMQualifier& source);
     /// The element's own qualifiers, onto `copy`.
     static void CopyOwnQualifiers(const TInMemQualifierSet& source, ICIMNamedElement& copy);
-
-    /// Errors: status 13 where a property or method that both classes have differs in type.
-    static void CheckTypes(const ICIMClass& source, const TInMemClass& target);
 };
 
 }  // namespace NORVZEL20

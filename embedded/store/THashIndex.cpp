@@ -1,3 +1,10 @@
+// A hash table with open addressing.
+//
+// An entry has a home, computed from its hash. If another entry is there, it goes to the next free place behind. A search starts at
+// the home and ends at the first free place, so there must be no free place between an entry and its home. Removing an entry would
+// leave one: the entries that follow are therefore moved up where they may. The table doubles when more than four fifths are in
+// use.
+
 #include "embedded/store/THashIndex.h"
 
 namespace NORVZEL20 {
@@ -47,7 +54,7 @@ void THashIndex::Remove(std::uint32_t hash, std::uint32_t ordinal) noexcept
         }
         hole = Next(hole);
     }
-    // Whatever follows without a gap moves up into the hole, unless its home lies behind it.
+    // An entry that follows without a gap moves up into the hole, but not if its home lies between the hole and itself.
     const std::size_t mask = fEntries.size() - 1;
     for (std::size_t at = Next(hole); fEntries[at].ordinal != kNone; at = Next(at)) {
         if (((at - Home(fEntries[at].hash)) & mask) >= ((at - hole) & mask)) {

@@ -9,10 +9,11 @@
 
 namespace NORVZEL20 {
 
-/// Finds the ordinal of an element that somebody else keeps by the hash of its key: open addressing, eight bytes an entry.
+/// Finds elements of a list by the hash of their keys. An element is known by its ordinal, its position in the list.
 ///
-/// The index sees no keys: the caller tells for each ordinal of the right hash whether it is the one. All operations take constant
-/// time on average; Add and Reserve may throw std::bad_alloc and then change nothing.
+/// The index holds no keys, only pairs of hash and ordinal, eight bytes each. For each ordinal with the right hash it asks the
+/// caller whether that is the element. All operations take constant time on average; Add and Reserve may throw std::bad_alloc, and
+/// then nothing has changed.
 class CIMDELTA_EXPORT THashIndex {
   public:
     static constexpr std::uint32_t kNone = 0xffffffff;
@@ -34,9 +35,9 @@ class CIMDELTA_EXPORT THashIndex {
 
     /// `ordinal` must not be kNone, and not be there under `hash`.
     void Add(std::uint32_t hash, std::uint32_t ordinal);
-    /// Does nothing where the pair is not there.
+    /// Does nothing if the pair is not there.
     void Remove(std::uint32_t hash, std::uint32_t ordinal) noexcept;
-    /// Makes room, so that `count` entries in all can be added without a failure.
+    /// Makes room for `count` entries in all. Adding up to that number cannot fail then.
     void Reserve(std::size_t count);
     void Clear() noexcept;
     void Swap(THashIndex& other) noexcept;

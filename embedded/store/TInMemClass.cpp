@@ -1,3 +1,10 @@
+// A class as part of its namespace: its place in the class tree, and its instances.
+//
+// Who holds whom: the namespace holds its classes and, in one extent for each, their instances; an instance holds its class, a
+// class its superclass. Everything that points the other way is weak, and so is the pointer to the namespace; so nothing keeps
+// itself alive. The extent is not the class's own, because the class would then hold instances that hold the class. A class has a
+// pointer to it while it is declared; the namespace sets the pointer and takes it back when the class goes, or the namespace.
+
 #include "embedded/store/TInMemClass.h"
 
 #include <algorithm>
@@ -63,7 +70,7 @@ void TInMemClass::Enter(TInMemClass& parent, TInMemExtent& extent)
     if (fLayout.CatchUp()) {
         fMethods.InheritAll();
     }
-    parent.fSubClasses.push_back(weak_from_this());
+    parent.fSubClasses.push_back(weak_from_this());  // the last step that may fail
     fExtent = &extent;
 }
 
@@ -95,11 +102,12 @@ void TInMemClass::RemoveFromNamespace(TCallContext)
 
 void TInMemClass::ModifyClass(boost::shared_ptr<ICIMClass> cls, TCallContext context)
 {
-    TDeclCopy::CheckTypes(*cls, *this);
+    CheckTypesAgree(*cls, *this);
     std::vector<boost::shared_ptr<TInMemPropertyDecl>> missing;
     cls->EnumeratePropertyDecls(
         [this, &missing](boost::shared_ptr<ICIMPropertyDecl> decl) {
             if (!FindPropertyDecl(decl->GetName(TCallContext()))) {
+                // All are checked before the first one is added: a conflict of types changes nothing.
                 missing.push_back(TDeclCopy::CopyProperty(*decl));
                 CheckTypeFits(*this, *missing.back());
             }
@@ -180,6 +188,7 @@ std::vector<boost::shared_ptr<TInMemClass>> TInMemClass::GetSubClasses() const
 
 std::vector<boost::shared_ptr<TInMemClass>> TInMemClass::GetClassesBelow() const
 {
+    // A stack instead of recursion, because a line of classes may be longer than the stack of the process allows.
     std::vector<boost::shared_ptr<TInMemClass>> below;
     std::vector<boost::shared_ptr<TInMemClass>> open = GetSubClasses();
     std::reverse(open.begin(), open.end());
@@ -234,7 +243,7 @@ boost::shared_ptr<ICIMInstance> TInMemClass::AllocateInstance(TCallContext)
 void TInMemClass::EnumerateInstances(const boost::function<bool(boost::shared_ptr<ICIMInstance>)>& callback, bool deep,
                                      TCallContext)
 {
-    const auto ns = RequireNamespace();  // held, lest the callback lets go of it
+    const auto ns = RequireNamespace();  // kept alive while the callback runs
     if (fName != kRootClassName && !GetExtent().Enumerate(callback)) {
         return;
     }
@@ -329,6 +338,7 @@ void TInMemClass::SetSpelling(const std::string& name)
     if (!TNameText::Equal(name, fName)) {
         throw TZELException(TZELStatusCode::kInvalidParameter);
     }
+    // In place: the namespace looks the class up by a view of this text.
     std::copy(name.begin(), name.end(), fName.begin());
     if (const auto ns = fNamespace.lock()) {
         ns->ReferenceTextsChanged();

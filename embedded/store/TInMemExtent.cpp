@@ -21,6 +21,9 @@ namespace NORVZEL20 {
 
 namespace {
 
+constexpr std::size_t kMinCompactedSize = 32;  // gaps in a list up to this length are not worth a pass
+
+/// The hash of the keys before `key`, which is `seed`, and of `key`.
 std::uint32_t Mix(std::uint32_t seed, const TCIMValue& key)
 {
     const std::uint64_t hash = key.Hash();
@@ -50,8 +53,9 @@ void TInMemExtent::Add(const boost::shared_ptr<TInMemInstance>& instance)
 {
     CheckKeysAreSet(*instance);
     Refresh();
+    // Room first: once the index has the instance, nothing may fail.
     if (fInstances.size() == fInstances.capacity()) {
-        fInstances.reserve(fInstances.size() + fInstances.size() / 2 + 2);
+        fInstances.reserve(fInstances.size() + fInstances.size() / 2 + 2);  // doubling would waste much
     }
     fIndex.Reserve(fCount + 1);
     FillGeneratedKeys(*instance);
@@ -69,7 +73,7 @@ void TInMemExtent::Check(const TInMemInstance& instance) const
     CheckKeysAreSet(instance);
     for (const std::uint32_t slot : fLayout.GetKeys()) {
         if (instance.GetSlotValue(slot).IsNull()) {
-            return;  // a number of its own will be generated
+            return;  // it will get a number that no other instance has
         }
     }
     Refresh();
@@ -103,6 +107,7 @@ void TInMemExtent::FillGeneratedKeys(TInMemInstance& instance)
     }
 }
 
+/// Numbers that are given in an inventory are not generated again.
 void TInMemExtent::SkipGenerated(const TInMemInstance& instance) noexcept
 {
     for (const std::uint32_t slot : fLayout.GetKeys()) {
@@ -166,7 +171,7 @@ bool TInMemExtent::Remove(const TInMemInstance& instance)
     fInstances[ordinal]->SetRemoved();
     fInstances[ordinal].reset();
     --fCount;
-    if (fEnumerations == 0 && fInstances.size() > 32 && fCount < fInstances.size() / 2) {
+    if (fEnumerations == 0 && fInstances.size() > kMinCompactedSize && fCount < fInstances.size() / 2) {
         CompactIfPossible();
     }
     return true;
@@ -198,6 +203,7 @@ void TInMemExtent::Compact()
 
 void TInMemExtent::Clear() noexcept
 {
+    // Empty the extent before the first instance is released.
     std::vector<boost::shared_ptr<TInMemInstance>> instances;
     instances.swap(fInstances);
     fIndex.Clear();

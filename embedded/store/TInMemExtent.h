@@ -13,10 +13,11 @@ namespace NORVZEL20 {
 
 /// The instances of exactly one class, in order of insertion, found by key in constant time.
 ///
-/// Keys are those with which an instance was added. A class without keys has at most one instance.
+/// The keys that count are those with which an instance was added. A class without keys has at most one instance.
+/// Threads: as the namespace.
 class TInMemExtent {
   public:
-    /// What is needed to undo everything since: see GetMark.
+    /// A moment in the life of the extent, to which RollBack returns.
     struct TMark {
         std::uint32_t size;
         std::uint64_t nextGenerated;

@@ -21,7 +21,7 @@ class CIMDELTA_EXPORT TInMemMethodDecl : public TInMemNamedElement<ICIMMethodDec
     const std::string& GetName() const noexcept { return fName; }
     TCIMValue::TCIMType GetType() const noexcept { return fType; }
 
-    /// The class that a reference result points to; empty where none was named.
+    /// The class that a reference result points to; empty if none was named.
     const std::string& GetReferenceClass() const noexcept { return fReferenceClass; }
     void SetReferenceClass(const std::string& name) { fReferenceClass = name; }
     void AddParameter(boost::shared_ptr<TInMemParameter> parameter) { fParameters.push_back(std::move(parameter)); }

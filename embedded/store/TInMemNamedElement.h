@@ -17,7 +17,7 @@ namespace NORVZEL20 {
 template <class TInterface>
 class CIMDELTA_EXPORT TInMemNamedElement : public TInterface {
   public:
-    /// Errors: status 5 for null.
+    /// Errors: kInvalidParameter (5) for null.
     void AddQualifier(boost::shared_ptr<ICIMQualifier> qualifier, TCallContext context) override;
     boost::shared_ptr<ICIMQualifier> AllocateQualifier(boost::shared_ptr<const ICIMQualifierDecl> decl, const TCIMValue& value,
                                                        TCallContext context) const override;
@@ -33,7 +33,8 @@ class CIMDELTA_EXPORT TInMemNamedElement : public TInterface {
     void AddQualifier(boost::shared_ptr<ICIMQualifier> qualifier);
 
   protected:
-    /// Adds one that is not null, wholly or not at all; for elements that derive something from their qualifiers to override.
+    /// Adds one that is not null; if it fails, nothing has changed. Elements that derive something from their qualifiers override
+    /// it.
     virtual void PutQualifier(boost::shared_ptr<ICIMQualifier> qualifier) { fQualifiers.Add(std::move(qualifier)); }
     void InheritQualifiers(const TInMemQualifierSet* parent) noexcept { fQualifiers.SetParent(parent); }
 

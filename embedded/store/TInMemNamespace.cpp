@@ -1,3 +1,9 @@
+// The classes and qualifier declarations of a namespace.
+//
+// Each is kept twice: in a list in order of declaration, and in a table by name, whose keys are views of the names in the objects
+// themselves. Adding to both must succeed or fail as one, so a failure in the second step undoes the first. The pseudo-class
+// "<root>" is in neither; it is there for its list of subclasses, the top-level classes.
+
 #include "embedded/store/TInMemNamespace.h"
 
 #include <boost/smart_ptr/make_shared.hpp>
@@ -139,7 +145,7 @@ void TInMemNamespace::Declare(const boost::shared_ptr<TInMemClass>& cls)
 
 void TInMemNamespace::Withdraw(TInMemClass& cls) noexcept
 {
-    const auto keep = cls.shared_from_this();
+    const auto keep = cls.shared_from_this();  // the namespace may be the last to hold it
     cls.Leave(GetParent(cls));
     EraseLast(fClasses, [&keep](const boost::shared_ptr<TInMemClass>& other) { return other == keep; });
     const auto entry = fClassesByName.find(cls.GetName());

@@ -76,6 +76,7 @@ void TInMemNamespace::ModifyInstance(const TCIMReference& path, TCallContext pro
             throw TZELException(TZELStatusCode::kInvalidParameter);
         }
     }
+    // All values fit; only now is the first one set.
     for (auto& [slot, value] : changes) {
         instance->SetSlot(slot, std::move(value));
     }

@@ -16,10 +16,10 @@ class CIMDELTA_EXPORT TInMemParameter : public TInMemNamedElement<ICIMNamedEleme
     const std::string& GetName() const noexcept { return fName; }
     TCIMValue::TCIMType GetType() const noexcept { return fType; }
 
-    /// The class that a reference points to; empty where none was named.
+    /// The class that a reference points to; empty if none was named.
     const std::string& GetReferenceClass() const noexcept { return fReferenceClass; }
     void SetReferenceClass(const std::string& name) { fReferenceClass = name; }
-    /// The number of elements of a fixed array; 0 where it is not fixed.
+    /// The number of elements of a fixed array; 0 if it is not fixed.
     unsigned int GetArraySize() const noexcept { return fArraySize; }
     void SetArraySize(unsigned int size) noexcept { fArraySize = size; }
 

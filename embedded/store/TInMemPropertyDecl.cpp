@@ -1,3 +1,11 @@
+// A property's declaration and what its qualifiers make of it.
+//
+// A declaration that overrides one of an ancestor inherits its qualifiers. Key and Static hold for all who override the property,
+// even if their flavor forbids inheritance: instances of a subclass must have the keys of the superclass, and a static value is one
+// for all. The marks (key, static, generated, bag) are asked for with every value that is set, so they are worked out when a
+// qualifier or the overridden declaration changes, not when they are read. A key that ceases to be one would make instances equal
+// that were told apart by it; such a qualifier is refused while there are any.
+
 #include "embedded/store/TInMemPropertyDecl.h"
 
 #include <algorithm>
@@ -79,6 +87,7 @@ void TInMemPropertyDecl::SetSpelling(const std::string& name)
     if (!TNameText::Equal(name, fName)) {
         throw TZELException(TZELStatusCode::kInvalidParameter);
     }
+    // In place: pointers to the name stay valid (ICIMClass::EnumerateKeyNames).
     std::copy(name.begin(), name.end(), fName.begin());
 }
 
@@ -123,6 +132,7 @@ bool TInMemPropertyDecl::IsBagDeclared() const
     if (GetQualifiers().IsTrue("OctetString")) {
         return false;
     }
+    // DSP0004 makes an array a bag if nothing else is said.
     const auto arrayType = GetQualifiers().Find("ArrayType");
     if (!arrayType) {
         return true;

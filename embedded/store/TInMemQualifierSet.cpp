@@ -1,3 +1,9 @@
+// Qualifiers of an element and of its ancestors.
+//
+// Inherited qualifiers are not copied: a set points to its parent, and a search goes up. A qualifier that is added to a superclass
+// is therefore visible below at once. The nearest one of a name decides. If its flavor is "restricted" the search ends there
+// without a result, even if one farther up would be inherited: the nearer one has replaced it.
+
 #include "embedded/store/TInMemQualifierSet.h"
 
 #include "embedded/value/TNameText.h"

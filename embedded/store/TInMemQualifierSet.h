@@ -10,9 +10,9 @@
 
 namespace NORVZEL20 {
 
-/// The qualifiers of one element: its own, and those that it inherits from the element it stems from.
+/// The qualifiers of one element: its own, and those that it inherits from its parent, the element of the superclass.
 ///
-/// A qualifier is inherited where its flavor says so (to the subclass) and the element has none of that name itself.
+/// A qualifier is inherited if its flavor says so (to the subclass) and the element has none of that name itself.
 class CIMDELTA_EXPORT TInMemQualifierSet {
   public:
     /// Letter case does not count.
@@ -23,7 +23,7 @@ class CIMDELTA_EXPORT TInMemQualifierSet {
     /// Names the set to inherit from; null for none. It must outlive this one.
     void SetParent(const TInMemQualifierSet* parent) noexcept { fParent = parent; }
 
-    /// Adds one, or puts it in the place of an own one of that name. `qualifier` must not be null.
+    /// Adds one. An own one of that name is replaced. `qualifier` must not be null.
     void Add(boost::shared_ptr<ICIMQualifier> qualifier);
 
     /// The qualifier of that name, own or inherited, or null. Letter case does not count.
@@ -33,13 +33,13 @@ class CIMDELTA_EXPORT TInMemQualifierSet {
 
     /// The element's own ones, in the order they were added.
     const std::vector<boost::shared_ptr<ICIMQualifier>>& GetOwn() const noexcept { return fOwn; }
-    /// How many there are in this set and in those above it, hidden ones included.
+    /// How many there are in this set and its ancestors, those that are not inherited included.
     std::size_t CountAll() const noexcept;
     /// Whether there is one of that name, own or inherited, with the value TRUE.
     bool IsTrue(std::string_view name) const;
     /// Whether the element itself has one of that name with the value TRUE.
     bool IsOwnTrue(std::string_view name) const;
-    /// Whether the element or any that it stems from has one of that name with the value TRUE, whatever its flavor.
+    /// Whether the element or an ancestor has one of that name with the value TRUE, whatever its flavor.
     bool IsTrueAnywhere(std::string_view name) const;
 
     /// The element's own one of that name, or null.

@@ -27,7 +27,7 @@ void TInMemStaticProperty::MarkRemoved()
 void TInMemStaticProperty::MarkChanged(const TCIMValue& value)
 {
     const TCIMValue before = fState.value;
-    SetValue(value);
+    SetValue(value);  // may fail, and then nothing is marked
     if (!fState.isChanged) {
         fState.earlier = before;
         fState.isChanged = true;

@@ -5,9 +5,10 @@
 
 namespace NORVZEL20 {
 
-/// The allocator for the counts of a shared pointer that stand in front of their object, in one block with it.
+/// Places the counts of a shared pointer in front of the object that it points to, in the same block of memory.
 ///
-/// The block begins with `kPlace` bytes for the counts; it goes when they go, after the object has been destroyed.
+/// The block begins with `kPlace` bytes for the counts, then comes the object. It is released with the counts, when the last weak
+/// pointer goes; the object has been destroyed by then.
 template <class T>
 class TPlacedAllocator {
   public:

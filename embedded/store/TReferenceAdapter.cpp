@@ -6,7 +6,7 @@
 // properties of embedded objects are searched too. A value in which nothing changes is not copied.
 //
 // If a reference that is a key changes, its instance has another path. The index of the extent is renewed afterwards, and two
-// instances may turn out to be the same one: "Slot.Card=5" and "slot.card=5" name one card.
+// instances may turn out to have one path, if their keys differed in nothing but the spelling of a name.
 
 #include "embedded/store/TReferenceAdapter.h"
 

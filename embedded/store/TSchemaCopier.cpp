@@ -1,3 +1,11 @@
+// Copying declarations from one namespace to another.
+//
+// A class needs its superclasses, and its qualifiers should be declared. So a class is copied from the top down: first the
+// superclasses that the target lacks, each with its own properties, methods and qualifiers only, because it inherits the rest
+// in the target. The superclasses that the target has may differ from the original's; a conflict of types shows when the copy is
+// declared, and the staging then takes back every class of the call. Every class and every property is held against the limits
+// before it is declared: two schemas within the limits can go beyond them together.
+
 #include "embedded/store/TSchemaCopier.h"
 
 #include "embedded/store/TDeclCopy.h"
@@ -12,12 +20,11 @@ namespace {
 void CheckHeight(const TInMemClass& cls)
 {
     if (cls.CountSuperClasses() > TSchemaLimits::kMaxSuperClasses) {
-        throw TSchemaLimitError("it would be below more than " + std::to_string(TSchemaLimits::kMaxSuperClasses) +
+        throw TSchemaLimitError("it would have more than " + std::to_string(TSchemaLimits::kMaxSuperClasses) +
                                 " superclasses; flatten the class tree");
     }
 }
 
-/// Whether the class has room for so many properties.
 void CheckWidth(const TInMemClass& cls, std::size_t properties)
 {
     if (properties > TSchemaLimits::kMaxProperties) {

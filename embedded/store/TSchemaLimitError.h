@@ -7,7 +7,7 @@
 
 namespace NORVZEL20 {
 
-/// A class would go beyond TSchemaLimits: status 31.
+/// A class would go beyond TSchemaLimits. Status: kNotSupported (31).
 class CIMDELTA_EXPORT TSchemaLimitError : public TZELException {
   public:
     /// `text` says which limit, for people.

@@ -4,10 +4,10 @@
 
 namespace NORVZEL20 {
 
-/// The most that classes made from what others wrote may have of anything whose cost adds up: many times what any published schema
-/// has. Counts include what is inherited.
+/// The bounds for classes that come from a document: no document makes the program use too much memory or time. They are many times
+/// what any published schema has. Counts include what is inherited.
 struct TSchemaLimits {
-    static constexpr std::size_t kMaxSuperClasses = 1000;  ///< of a class; whoever walks a class tree may do so recursively
+    static constexpr std::size_t kMaxSuperClasses = 1000;  ///< of a class; so a class tree may be walked by recursion
     static constexpr std::size_t kMaxProperties = 1024;    ///< of a class, an instance or an embedded object
     static constexpr std::size_t kMaxMethods = 1024;       ///< of a class, overridden ones included
     static constexpr std::size_t kMaxQualifiers = 1024;    ///< of an element, restated ones included
