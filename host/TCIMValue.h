@@ -69,10 +69,10 @@ class CIMDELTA_EXPORT alignas(8) TCIMValue {
         bool IsArray() const noexcept { return fType > kArray; }
 
         /// The type of one element; the type itself if it is no array.
-        TCIMType GetElementType() const noexcept { return IsArray() ? ECIMType(fType - kArray) : fType; }
+        TCIMType GetElementType() const noexcept { return IsArray() ? static_cast<ECIMType>(fType - kArray) : fType; }
 
         /// The type of an array of this; the type itself if it is an array already.
-        TCIMType GetArrayType() const noexcept { return IsArray() ? fType : ECIMType(fType + kArray); }
+        TCIMType GetArrayType() const noexcept { return IsArray() ? fType : static_cast<ECIMType>(fType + kArray); }
 
       private:
         ECIMType fType;

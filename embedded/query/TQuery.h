@@ -24,14 +24,14 @@ struct TQueryCondition;
 ///               | operand "IS" [ "NOT" ] "NULL" | operand "ISA" ( name | text )
 ///     operand   = name | text | number | "TRUE" | "FALSE" | "NULL"
 ///
-/// Words:   Key words and names may have any letter case. A name may follow that of the class (`Disk.Size`). Text is in single or
-///          double quotes, with a backslash in front of a quote or backslash within. LIKE takes a TLikePattern.
-/// Answer:  Whole instances of the class and its subclasses, even if the query lists properties. Listed properties must be
-/// declared. NULL:    A test with a NULL is neither true nor false, and so is its NOT. Only IS NULL finds NULLs. Values:  Text
-/// compares byte for byte, numbers by value whatever their types, references by path text, datetimes as instants; a
-///          test with asterisks in a datetime is neither true nor false. Arrays can only be tested for NULL.
-/// ISA:     The left side is a reference or an embedded object, whose class is tested, or the name of the query's class for the
-///          class of the instance itself.
+/// - Key words and names may have any letter case. A name may follow that of the class (`Disk.Size`).
+/// - Text is in single or double quotes, with a backslash in front of a quote or backslash within. LIKE takes a TLikePattern.
+/// - The answer has whole instances of the class and its subclasses, even if the query lists properties. Those must be declared.
+/// - A test with a NULL is neither true nor false, and so is its NOT. Only IS NULL finds NULLs.
+/// - Text compares byte for byte, numbers by value whatever their types, references by path text, datetimes as instants. A test
+///   with asterisks in a datetime is neither true nor false. Arrays can only be tested for NULL.
+/// - ISA tests the class of a reference or an embedded object. With the name of the query's class on the left it tests the class of
+///   the instance itself.
 ///
 /// Threads: as for the namespace that the query runs on.
 class CIMDELTA_EXPORT TQuery {

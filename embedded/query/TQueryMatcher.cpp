@@ -126,7 +126,7 @@ TQueryMatcher::ETruth TQueryMatcher::Evaluate(const TQueryCondition& condition, 
     case TQueryCondition::kAnd:
         return EvaluateParts(condition, instance);
     case TQueryCondition::kNot:
-        return ETruth(kTrue - Evaluate(*condition.parts[0], instance));
+        return static_cast<ETruth>(kTrue - Evaluate(*condition.parts[0], instance));
     case TQueryCondition::kIsNull:
         return GetValue(condition.operands[0], instance).IsNull() ? kTrue : kFalse;
     case TQueryCondition::kLike:

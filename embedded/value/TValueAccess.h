@@ -27,7 +27,7 @@ class CIMDELTA_INTERNAL_EXPORT TValueAccess {
     };
     static constexpr std::size_t kShortTextSize = 13;
 
-    static EForm GetForm(const TCIMValue& value) noexcept { return EForm(value.fForm); }
+    static EForm GetForm(const TCIMValue& value) noexcept { return static_cast<EForm>(value.fForm); }
 
     /// A string that shares `text`, or has a copy of a short one. `text` must not be null.
     static TCIMValue FromSharedText(const TSharedText::TPointer& text) noexcept;

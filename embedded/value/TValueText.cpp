@@ -154,7 +154,7 @@ bool ParseDateTime(std::string_view text, TCIMValue& result)
 
 bool TValueText::Parse(TCIMValue::TCIMType type, std::string_view text, TCIMValue& result)
 {
-    switch (static_cast<TType::ECIMType>(type)) {
+    switch (type) {
     case TType::kString:
         result = TCIMValue::FromText(text);
         return true;

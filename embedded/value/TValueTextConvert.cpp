@@ -80,7 +80,7 @@ bool TValueText::Convert(const TCIMValue& value, TCIMValue::TCIMType type, TCIMV
         return true;
     }
     const TType from = value.GetType();
-    if (TType::ECIMType(from) == type) {
+    if (from == type) {
         result = value;
         return true;
     }
@@ -89,11 +89,10 @@ bool TValueText::Convert(const TCIMValue& value, TCIMValue::TCIMType type, TCIMV
     }
     if (TValueAccess::IsText(value)) {
         const std::string_view text = TValueAccess::GetText(value);
-        return TType::ECIMType(type) == TType::kReference ? ConvertToPath(text, result) : Parse(type, text, result);
+        return type == TType::kReference ? ConvertToPath(text, result) : Parse(type, text, result);
     }
-    if (TType::ECIMType(type) == TType::kString) {
-        const bool hasText = TType::ECIMType(from) == TType::kChar16 || TType::ECIMType(from) == TType::kDateTime ||
-                             TType::ECIMType(from) == TType::kReference;
+    if (type == TType::kString) {
+        const bool hasText = from == TType::kChar16 || from == TType::kDateTime || from == TType::kReference;
         return hasText && Parse(type, value.ToText(), result);
     }
     return ConvertNumber(value, type, result);

@@ -74,7 +74,7 @@ void AppendElement(std::string& out, const TCIMValue& element)
 
 void AppendArray(std::string& out, const TCIMValue& value)
 {
-    const bool isOfPaths = TType::ECIMType(value.GetType()) == TType::kArrayReference;
+    const bool isOfPaths = value.GetType() == TType::kArrayReference;
     out += isOfPaths ? "<VALUE.REFARRAY>" : "<VALUE.ARRAY>";
     for (const TCIMValue& element : value.GetElements()) {
         AppendElement(out, element);
@@ -114,7 +114,7 @@ void AppendClassName(std::string& out, const TCIMReference& path)
 /// The attribute VALUETYPE, which is coarser than a type.
 const char* GetKeyKind(TType type)
 {
-    switch (TType::ECIMType(type)) {
+    switch (type) {
     case TType::kBoolean:
         return "boolean";
     case TType::kString:
@@ -180,7 +180,7 @@ void AppendOrigin(std::string& out, const std::string& classOrigin, bool propaga
 /// The type of a property or parameter. The name of its element already says whether it is a reference or an array.
 void AppendTypeAttributes(std::string& out, TType type, const std::string& referenceClass, unsigned int arraySize)
 {
-    if (TType::ECIMType(type.GetElementType()) == TType::kReference) {
+    if (type.GetElementType() == TType::kReference) {
         if (!referenceClass.empty()) {
             TValueXml::AppendAttribute(out, "REFERENCECLASS", referenceClass);
         }
@@ -195,7 +195,7 @@ void AppendTypeAttributes(std::string& out, TType type, const std::string& refer
 /// The element's name for the type, such as PROPERTY.ARRAY.
 std::string GetKindName(const char* base, TType type)
 {
-    const bool isReference = TType::ECIMType(type.GetElementType()) == TType::kReference;
+    const bool isReference = type.GetElementType() == TType::kReference;
     return std::string(base) + (isReference ? (type.IsArray() ? ".REFARRAY" : ".REFERENCE") : (type.IsArray() ? ".ARRAY" : ""));
 }
 
@@ -208,7 +208,7 @@ const TObject* AsObject(const TCIMValue& value)
 /// reader take all of it for objects.
 const TObject* FindObject(const TCIMValue& value)
 {
-    if (value.IsNull() || TType::ECIMType(value.GetType()) != TType::kArrayString) {
+    if (value.IsNull() || value.GetType() != TType::kArrayString) {
         return AsObject(value);
     }
     const TObject* object = nullptr;
@@ -332,7 +332,7 @@ void TValueXml::AppendMethod(std::string& out, const TEmbeddedObject::TMethod& m
 {
     out += "<METHOD";
     AppendAttribute(out, "NAME", method.fName);
-    if (TType::ECIMType(method.fType) != TType::kNone) {
+    if (method.fType != TType::kNone) {
         AppendAttribute(out, "TYPE", TValueText::GetTypeName(method.fType));
     }
     AppendOrigin(out, method.fClassOrigin, method.fPropagated);
