@@ -28,7 +28,7 @@ class QueryErrorTest : public TInMemFixture {
     }
 };
 
-TEST_F(QueryErrorTest, EachBadQueryIsToldWithItsPlace)
+TEST_F(QueryErrorTest, EachBadQueryIsReportedWithItsPlace)
 {
     const struct {
         const char* query;
@@ -108,7 +108,7 @@ TEST_F(QueryErrorTest, DepthIsBounded)
     EXPECT_EQ("16: query, column 826: conditions stand in each other more than 200 deep", ErrorOf(nested(100000, "NOT ", "")));
 }
 
-TEST_F(QueryErrorTest, ErrorsTellMessageAndPosition)
+TEST_F(QueryErrorTest, AnErrorHasItsMessageAndPosition)
 {
     try {
         const TQuery query("WQL", "SELECT * FORM Disk");

@@ -1,8 +1,8 @@
 #include "embedded/query/TQuery.h"
 
 #include "embedded/value/TEmbeddedObject.h"
-#include "host/TCIMDateTime.h"
 #include "tests/embedded/store/InMemFixture.h"
+#include "tests/embedded/value/DateTimeOf.h"
 
 namespace NORVZEL20 {
 namespace {
@@ -24,30 +24,23 @@ class QueryTest : public TInMemFixture {
                           {"Tags", TType::kArrayString, {}}});
         disk = Declare("Disk", device, {{"Label", TType::kString, {}}});
         Add(device, {{"Id", "cpu"},
-                     {"Big", TCIMValue(~std::uint64_t(0))},
+                     {"Big", TCIMValue(~static_cast<std::uint64_t>(0))},
                      {"Small", TCIMValue(static_cast<signed char>(-5))},
                      {"Share", TCIMValue(0.5)},
                      {"On", TCIMValue(true)},
                      {"Grade", TCIMValue(u'b')}});
         const auto fan = Add(device, {{"Id", "fan"},
-                                      {"Big", TCIMValue(std::uint64_t(3))},
+                                      {"Big", TCIMValue(static_cast<std::uint64_t>(3))},
                                       {"On", TCIMValue(false)},
-                                      {"Since", Time("20200102030405.000000+060")}});
+                                      {"Since", TCIMValue(DateTimeOf("20200102030405.000000+060"))}});
         Add(disk, {{"Id", "sda"},
                    {"Label", "a\"b'c\\d"},
-                   {"Big", TCIMValue(std::uint64_t(3))},
+                   {"Big", TCIMValue(static_cast<std::uint64_t>(3))},
                    {"Share", TCIMValue(3.0)},
                    {"Next", TCIMValue(fan->GetReference())},
                    {"Tags", Texts({"x"})},
-                   {"Since", Time("2020010203****.******+060")}});
+                   {"Since", TCIMValue(DateTimeOf("2020010203****.******+060"))}});
         Add(disk, {{"Id", "sdb"}, {"Part", TCIMValue(boost::make_shared<const TEmbeddedObject>("Disk"))}});
-    }
-
-    static TCIMValue Time(const char* text)
-    {
-        TCIMDateTime time;
-        EXPECT_TRUE(TCIMDateTime::Parse(text, time));
-        return TCIMValue(time);
     }
 
     /// The ids of the answers, with blanks between.
@@ -78,7 +71,7 @@ TEST_F(QueryTest, CoversTheClassAndAllBelow)
     EXPECT_EQ("sda sdb", Answer("SELECT Disk.* FROM Disk"));
 }
 
-TEST_F(QueryTest, StopsWhereTheCallbackSaysSo)
+TEST_F(QueryTest, StopsWhenTheCallbackReturnsFalse)
 {
     int answers = 0;
     TQuery("WQL", "SELECT * FROM Device").Execute(*ns, [&](boost::shared_ptr<ICIMInstance>) { return ++answers < 3; });

@@ -3,7 +3,6 @@
 #include <stdlib.h>
 
 #include <algorithm>
-
 #include <boost/smart_ptr/make_shared.hpp>
 #include <fstream>
 
@@ -11,11 +10,12 @@
 #include "embedded/services/TCoreLog.h"
 #include "embedded/services/TProviderLibrary.h"
 #include "embedded/services/TSpdLogger.h"
-#include "host/ICIMNamespace.h"
 #include "host/TNamespaceProviderManager.h"
 #include "host/TOSSpecific.h"
 #include "host/TRootObject.h"
+#include "tests/embedded/services/TNamedProvider.h"
 #include "tests/embedded/value/StatusOf.h"
+#include "tests/support/TCapturingLogger.h"
 
 namespace NORVZEL20 {
 namespace {
@@ -23,36 +23,12 @@ namespace {
 using testing::EndsWith;
 using testing::HasSubstr;
 
-/// The core log while it lives.
-class TLogKeeper : public ILogger {
-  public:
-    TLogKeeper() : fPrevious(TCoreLog::Set(this)) {}
-    ~TLogKeeper() override { TCoreLog::Set(fPrevious); }
-    void Log(int level, const std::string& message) override { fText += std::to_string(level) + " " + message + "\n"; }
-
-    std::string fText;
-
-  private:
-    ILogger* fPrevious;
-};
-
-class TNamedProvider : public INamespaceProvider {
-  public:
-    explicit TNamedProvider(std::string name) : fName(std::move(name)) {}
-    const std::string& GetName(TCallContext) const override { return fName; }
-    boost::shared_ptr<ICIMNamespace> AllocateNamespace(TCallContext, bool, std::string) const override { return nullptr; }
-    int GetType(TCallContext) const override { return 0; }
-    bool IsIndicationsSupported(TCallContext) const override { return false; }
-
-  private:
-    std::string fName;
-};
-
 TEST(StatusTest, EachStatusHasItsText)
 {
     std::string texts;
     for (const int status : {0, 1, 3, 4, 5, 9, 11, 12, 13, 14, 15, 16, 17, 18, 19, 31, 37, 38}) {
-        texts += std::to_string(status) + " " + TZELStatusCode(TZELStatusCode::EStatusCode(status)).TranslateStatusCode() + "\n";
+        texts += std::to_string(status) + " " +
+                 TZELStatusCode(static_cast<TZELStatusCode::EStatusCode>(status)).TranslateStatusCode() + "\n";
     }
     EXPECT_EQ(
         "0 Success\n1 Not offered\n3 Initialization failed\n4 Out of memory\n5 Invalid parameter\n9 Parse error\n11 File error\n"
@@ -64,11 +40,11 @@ TEST(StatusTest, EachStatusHasItsText)
 TEST(StatusTest, EveryOtherNumberHasOneText)
 {
     for (const int status : {2, 6, 39, 63}) {
-        EXPECT_EQ("Unknown status", TZELStatusCode(TZELStatusCode::EStatusCode(status)).TranslateStatusCode());
+        EXPECT_EQ("Unknown status", TZELStatusCode(static_cast<TZELStatusCode::EStatusCode>(status)).TranslateStatusCode());
     }
 }
 
-TEST(StatusTest, AnExceptionTellsTheTextOfItsStatus)
+TEST(StatusTest, AnExceptionHasTheTextOfItsStatus)
 {
     const TZELException failure(TZELStatusCode::kNotSupported);
     EXPECT_STREQ("Not supported", failure.what());
@@ -81,10 +57,10 @@ TEST(CoreLogTest, AReplacedLoggerGetsTheEntriesUntilItIsRemoved)
     ILogger* const standard = TRootObject::GetCoreLogger();
     ASSERT_NE(nullptr, standard);
     {
-        TLogKeeper log;
+        TCapturingLogger log;
         EXPECT_EQ(&log, TRootObject::GetCoreLogger());
         TRootObject::GetCoreLogger()->Log(0, "something went wrong");
-        EXPECT_EQ("0 something went wrong\n", log.fText);
+        EXPECT_EQ("0|something went wrong|", log.Take());
     }
     EXPECT_EQ(standard, TRootObject::GetCoreLogger());
     EXPECT_EQ(standard, TCoreLog::Set(nullptr));
@@ -111,7 +87,7 @@ TEST(CoreLogTest, TheStandardLoggerWritesALineToStandardError)
 
 TEST(AssertionTest, ANullPointerEndsTheCallAndIsLogged)
 {
-    TLogKeeper log;
+    TCapturingLogger log;
     const boost::shared_ptr<std::string> null;
     try {
         static_cast<void>(null->size());
@@ -120,15 +96,15 @@ TEST(AssertionTest, ANullPointerEndsTheCallAndIsLogged)
         EXPECT_THAT(failure.what(), HasSubstr("px != 0"));
         EXPECT_THAT(failure.what(), HasSubstr("operator->"));
         EXPECT_THAT(failure.what(), HasSubstr("shared_ptr.hpp line "));
-        EXPECT_EQ(std::string("0 ") + failure.what() + "\n", log.fText);
+        EXPECT_EQ(std::string("0|") + failure.what() + "|", log.Take());
     }
 }
 
-TEST(AssertionTest, AMessageIsTold)
+TEST(AssertionTest, AMessageIsLogged)
 {
-    TLogKeeper log;
+    TCapturingLogger log;
     EXPECT_THROW(boost::assertion_failed_msg("a == b", "they differ", "Compare", "compare.cpp", 7), std::logic_error);
-    EXPECT_EQ("0 Assertion failed: a == b (they differ) in Compare, compare.cpp line 7\n", log.fText);
+    EXPECT_EQ("0|Assertion failed: a == b (they differ) in Compare, compare.cpp line 7|", log.Take());
 }
 
 TEST(ProviderManagerTest, TheInMemoryProviderIsThereFromTheStart)
@@ -191,9 +167,9 @@ TEST(ProviderLibraryTest, ALibraryRegistersItsProvidersWhileItIsLoaded)
 TEST(ProviderLibraryTest, WhatCannotBeLoadedIsLogged)
 {
     for (const char* const path : {"", "/nowhere/libnothing.so", "/proc/self/cmdline"}) {
-        TLogKeeper log;
+        TCapturingLogger log;
         EXPECT_EQ(TZELStatusCode::kFileError, StatusOf([&] { TProviderLibrary::Load(path); })) << path;
-        EXPECT_THAT(log.fText, testing::StartsWith("0 Cannot load provider library \"" + std::string(path) + "\": "));
+        EXPECT_THAT(log.Take(), testing::StartsWith("0|Cannot load provider library \"" + std::string(path) + "\": "));
     }
 }
 

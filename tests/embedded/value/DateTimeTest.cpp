@@ -3,17 +3,12 @@
 #include <cstdio>
 #include <string>
 
-#include "host/TCIMDateTime.h"
+#include "tests/embedded/value/DateTimeOf.h"
 
 namespace NORVZEL20 {
 namespace {
 
-TCIMDateTime At(const std::string& text)
-{
-    TCIMDateTime time;
-    EXPECT_TRUE(TCIMDateTime::Parse(text, time)) << text;
-    return time;
-}
+constexpr std::int64_t kMicrosecondsOfDay = 86400000000;
 
 TEST(DateTimeTest, TextComesBackAsItWasRead)
 {
@@ -22,53 +17,53 @@ TEST(DateTimeTest, TextComesBackAsItWasRead)
           "99991231235959.999999+999", "00000000000000.000000:000", "99999999235959.999999:000", "00000012123456.9*****:000",
           "2024**********.******+000", "****0131******.******-420", "********120000.000000+000", "202402291234**.******+060",
           "19000301000000.000000+000", "19691231235959.999999+000"}) {
-        EXPECT_EQ(text, At(text).ToText());
+        EXPECT_EQ(text, DateTimeOf(text).ToText());
     }
 }
 
 TEST(DateTimeTest, MicrosecondsCountFrom1970InUtc)
 {
-    EXPECT_EQ(0, At("19700101000000.000000+000").GetMicroseconds());
-    EXPECT_EQ(-1, At("19691231235959.999999+000").GetMicroseconds());
-    EXPECT_EQ(1709164800000000, At("20240229000000.000000+000").GetMicroseconds());
-    EXPECT_EQ(1709164800000000 - 3600000000, At("20240229000000.000000+060").GetMicroseconds());
-    EXPECT_EQ(60, At("20240229000000.000000+060").GetOffset());
-    EXPECT_EQ(90061000001, At("00000001010101.000001:000").GetMicroseconds());
+    EXPECT_EQ(0, DateTimeOf("19700101000000.000000+000").GetMicroseconds());
+    EXPECT_EQ(-1, DateTimeOf("19691231235959.999999+000").GetMicroseconds());
+    EXPECT_EQ(1709164800000000, DateTimeOf("20240229000000.000000+000").GetMicroseconds());
+    EXPECT_EQ(1709164800000000 - 3600000000, DateTimeOf("20240229000000.000000+060").GetMicroseconds());
+    EXPECT_EQ(60, DateTimeOf("20240229000000.000000+060").GetOffset());
+    EXPECT_EQ(90061000001, DateTimeOf("00000001010101.000001:000").GetMicroseconds());
 }
 
 TEST(DateTimeTest, EqualMeansTheSameInstant)
 {
-    EXPECT_EQ(At("20240101120000.000000+000"), At("20240101130000.000000+060"));
-    EXPECT_NE(At("20240101120000.000000+000"), At("20240101120000.000000+060"));
-    EXPECT_NE(At("20240101120000.000000+000"), At("20240101120000.000001+000"));
-    EXPECT_NE(At("20240101120000.000000+000"), At("20240101120000.00000*+000")) << "asterisks in other places";
-    EXPECT_EQ(At("202401011200**.******+000"), At("202401011300**.******+060"));
+    EXPECT_EQ(DateTimeOf("20240101120000.000000+000"), DateTimeOf("20240101130000.000000+060"));
+    EXPECT_NE(DateTimeOf("20240101120000.000000+000"), DateTimeOf("20240101120000.000000+060"));
+    EXPECT_NE(DateTimeOf("20240101120000.000000+000"), DateTimeOf("20240101120000.000001+000"));
+    EXPECT_NE(DateTimeOf("20240101120000.000000+000"), DateTimeOf("20240101120000.00000*+000")) << "asterisks in other places";
+    EXPECT_EQ(DateTimeOf("202401011200**.******+000"), DateTimeOf("202401011300**.******+060"));
 }
 
 TEST(DateTimeTest, AnIntervalNeverEqualsAPointInTime)
 {
-    const TCIMDateTime interval = At("00000000000000.000000:000");
-    const TCIMDateTime timestamp = At("19700101000000.000000+000");
+    const TCIMDateTime interval = DateTimeOf("00000000000000.000000:000");
+    const TCIMDateTime timestamp = DateTimeOf("19700101000000.000000+000");
     EXPECT_TRUE(interval.IsInterval());
     EXPECT_EQ(interval.GetMicroseconds(), timestamp.GetMicroseconds());
     EXPECT_NE(interval, timestamp);
-    EXPECT_LT(At("99991231235959.999999+000"), interval);
+    EXPECT_LT(DateTimeOf("99991231235959.999999+000"), interval);
     EXPECT_FALSE(interval < timestamp);
 }
 
 TEST(DateTimeTest, OrderIsThatOfInstants)
 {
-    EXPECT_LT(At("20240101125959.000000+060"), At("20240101120000.000000+000"));
-    EXPECT_LT(At("00000000000000.000000:000"), At("00000000000000.000001:000"));
-    EXPECT_FALSE(At("20240101130000.000000+060") < At("20240101120000.000000+000"));
+    EXPECT_LT(DateTimeOf("20240101125959.000000+060"), DateTimeOf("20240101120000.000000+000"));
+    EXPECT_LT(DateTimeOf("00000000000000.000000:000"), DateTimeOf("00000000000000.000001:000"));
+    EXPECT_FALSE(DateTimeOf("20240101130000.000000+060") < DateTimeOf("20240101120000.000000+000"));
 }
 
-TEST(DateTimeTest, UnknownFieldsAreTold)
+TEST(DateTimeTest, UnknownFieldsHaveTheirBits)
 {
-    EXPECT_EQ(0x001, At("****0131000000.000000+000").GetUnknown());
-    EXPECT_EQ(0x800, At("20240131000000.00000*+000").GetUnknown());
-    EXPECT_EQ(0xFE0, At("202401310000**.******+000").GetUnknown());
-    EXPECT_EQ(0x001, At("********000000.000000:000").GetUnknown());
+    EXPECT_EQ(0x001, DateTimeOf("****0131000000.000000+000").GetUnknown());
+    EXPECT_EQ(0x800, DateTimeOf("20240131000000.00000*+000").GetUnknown());
+    EXPECT_EQ(0xFE0, DateTimeOf("202401310000**.******+000").GetUnknown());
+    EXPECT_EQ(0x001, DateTimeOf("********000000.000000:000").GetUnknown());
 }
 
 TEST(DateTimeTest, WhatIsNoDateTimeIsRefusedAndLeavesTheResult)
@@ -96,7 +91,7 @@ TEST(DateTimeTest, WhatIsNoDateTimeIsRefusedAndLeavesTheResult)
                                    "2*240101120000.000000+000",
                                    "20240101120000.000000+***",
                                    "-0240101120000.000000+000"}) {
-        TCIMDateTime time = At("20240101120000.000000+000");
+        TCIMDateTime time = DateTimeOf("20240101120000.000000+000");
         EXPECT_FALSE(TCIMDateTime::Parse(text, time)) << text;
         EXPECT_EQ("20240101120000.000000+000", time.ToText()) << text;
     }
@@ -104,12 +99,12 @@ TEST(DateTimeTest, WhatIsNoDateTimeIsRefusedAndLeavesTheResult)
 
 TEST(DateTimeTest, EightDigitsAreTheDaysOfAnInterval)
 {
-    EXPECT_EQ(20240101 * std::int64_t(86400000000) + 43200000000, At("20240101120000.000000:000").GetMicroseconds());
+    EXPECT_EQ(20240101 * kMicrosecondsOfDay + kMicrosecondsOfDay / 2, DateTimeOf("20240101120000.000000:000").GetMicroseconds());
 }
 
 TEST(DateTimeTest, EveryDayOfFourHundredYearsComesBack)
 {
-    std::int64_t expected = At("18000101000000.000000+000").GetMicroseconds();
+    std::int64_t expected = DateTimeOf("18000101000000.000000+000").GetMicroseconds();
     char text[64];
     for (int year = 1800; year < 2200; ++year) {
         for (int month = 1; month <= 12; ++month) {
@@ -119,12 +114,12 @@ TEST(DateTimeTest, EveryDayOfFourHundredYearsComesBack)
                 if (TCIMDateTime::Parse(text, time)) {
                     ASSERT_EQ(expected, time.GetMicroseconds()) << text;
                     ASSERT_EQ(text, time.ToText());
-                    expected += 86400000000;
+                    expected += kMicrosecondsOfDay;
                 }
             }
         }
     }
-    EXPECT_EQ(146097 * std::int64_t(86400000000), expected - At("18000101000000.000000+000").GetMicroseconds());
+    EXPECT_EQ(146097 * kMicrosecondsOfDay, expected - DateTimeOf("18000101000000.000000+000").GetMicroseconds());
 }
 
 }  // namespace

@@ -3,7 +3,7 @@
 #include <boost/smart_ptr/make_shared.hpp>
 
 #include "embedded/value/TStubClass.h"
-#include "host/TCIMDateTime.h"
+#include "tests/embedded/value/DateTimeOf.h"
 #include "tests/embedded/value/StatusOf.h"
 #include "tests/embedded/value/ValuePrinter.h"
 
@@ -23,7 +23,8 @@ std::string BindingsOf(const TCIMReference& path)
 {
     std::string text;
     path.EnumerateKeyBindings([&text](const std::pair<std::string, TCIMValue>& binding) {
-        text += binding.first + "=" + binding.second.ToText() + ":" + std::to_string(int(binding.second.GetType())) + " ";
+        text +=
+            binding.first + "=" + binding.second.ToText() + ":" + std::to_string(static_cast<int>(binding.second.GetType())) + " ";
         return true;
     });
     return text;
@@ -84,13 +85,11 @@ TEST(ReferenceTest, ANameBoundAgainGetsTheNewValueAndKeepsItsSpelling)
 
 TEST(ReferenceTest, EveryTypeOfKeyHasItsText)
 {
-    TCIMDateTime time;
-    ASSERT_TRUE(TCIMDateTime::Parse("20240101120000.000000+000", time));
     TCIMReference path = Path("C");
     path.AddKeyValue("a", TCIMValue("say \"hi\" \\ there"));
     path.AddKeyValue("b", TCIMValue(true));
     path.AddKeyValue("c", TCIMValue(u'\''));
-    path.AddKeyValue("d", TCIMValue(time));
+    path.AddKeyValue("d", TCIMValue(DateTimeOf("20240101120000.000000+000")));
     path.AddKeyValue("e", TCIMValue(0.1f));
     path.AddKeyValue("f", TCIMValue::Null(TCIMValue::TCIMType::kString));
     path.AddKeyValue("g", TCIMValue(static_cast<signed char>(-1)));

@@ -4,7 +4,7 @@
 
 namespace NORVZEL20 {
 
-/// The status that `call` fails with, 0 where it does not fail.
+/// The status that `call` fails with; 0 if it does not fail.
 template <class TCall>
 int StatusOf(const TCall& call)
 {

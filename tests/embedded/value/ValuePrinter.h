@@ -7,10 +7,10 @@
 
 namespace NORVZEL20 {
 
-/// What a failing expectation shows of a value; without it the framework would convert the value to a number, which throws.
+/// What a failing expectation prints for a value. Without it the framework would convert the value to a number, which throws.
 inline void PrintTo(const TCIMValue& value, std::ostream* out)
 {
-    *out << value.ToText() << " of type " << int(value.GetType());
+    *out << value.ToText() << " of type " << static_cast<int>(value.GetType());
 }
 
 inline void PrintTo(const TCIMReference& path, std::ostream* out)

@@ -6,7 +6,7 @@
 
 #include "embedded/value/TEmbeddedObject.h"
 #include "embedded/value/TValueAccess.h"
-#include "host/TCIMDateTime.h"
+#include "tests/embedded/value/DateTimeOf.h"
 #include "tests/embedded/value/StatusOf.h"
 #include "tests/embedded/value/ValuePrinter.h"
 
@@ -16,13 +16,6 @@ namespace {
 using TType = TCIMValue::TCIMType;
 
 constexpr int kTypeMismatch = TZELStatusCode::kTypeMismatch;
-
-TCIMDateTime At(const char* text)
-{
-    TCIMDateTime time;
-    EXPECT_TRUE(TCIMDateTime::Parse(text, time)) << text;
-    return time;
-}
 
 TCIMReference Disk(const char* id)
 {
@@ -41,12 +34,13 @@ boost::shared_ptr<const TEmbeddedObject> Setting(int size)
 
 TCIMValue Array(const std::vector<TCIMValue>& elements)
 {
-    return TCIMValue(elements.front().GetType(), unsigned(elements.size()), elements);
+    return TCIMValue(elements.front().GetType(), static_cast<unsigned int>(elements.size()), elements);
 }
 
 TCIMValue Numbers(std::initializer_list<int> numbers)
 {
-    return TCIMValue(TType(TType::kSint32), unsigned(numbers.size()), std::vector<TCIMValue>(numbers.begin(), numbers.end()));
+    return TCIMValue(TType(TType::kSint32), static_cast<unsigned int>(numbers.size()),
+                     std::vector<TCIMValue>(numbers.begin(), numbers.end()));
 }
 
 /// One value of each type and way of being held, no two equal.
@@ -66,8 +60,8 @@ std::vector<TCIMValue> OneOfEachKind()
             TCIMValue(u'7'),
             TCIMValue("7"),
             TCIMValue("more text than fits inside of a value"),
-            TCIMValue(At("20240101120000.000000+000")),
-            TCIMValue(At("00000007000000.000000:000")),
+            TCIMValue(DateTimeOf("20240101120000.000000+000")),
+            TCIMValue(DateTimeOf("00000007000000.000000:000")),
             TCIMValue(Disk("7")),
             TCIMValue(TCIMReference()),
             TCIMValue(Setting(7)),
@@ -88,7 +82,7 @@ TEST(ValueTest, EachConstructorGivesItsType)
     std::string types;
     for (const TCIMValue& value : OneOfEachKind()) {
         EXPECT_FALSE(value.IsNull());
-        types += std::to_string(int(value.GetType())) + " ";
+        types += std::to_string(static_cast<int>(value.GetType())) + " ";
     }
     EXPECT_EQ("1 2 3 4 5 6 7 8 9 10 11 12 13 13 14 14 15 15 13 23 29 ", types);
     EXPECT_EQ(TType::kUint64, TCIMValue(7ull).GetType());
@@ -97,7 +91,7 @@ TEST(ValueTest, EachConstructorGivesItsType)
 
 TEST(ValueTest, CodesOfArraysAreThoseOfTheirElementsPlus16)
 {
-    EXPECT_EQ(20, int(TType(TType::kUint16).GetArrayType()));
+    EXPECT_EQ(20, static_cast<int>(TType(TType::kUint16).GetArrayType()));
     EXPECT_EQ(TType::kArrayUint16, TType(TType::kArrayUint16).GetArrayType());
     EXPECT_EQ(TType::kUint16, TType(TType::kArrayUint16).GetElementType());
     EXPECT_EQ(TType::kReference, TType(TType::kReference).GetElementType());
@@ -179,17 +173,17 @@ TEST(ValueTest, RealsAreComparedByValueWithNanEqualToNan)
     EXPECT_NE(TCIMValue(0.0), TCIMValue(nan));
     EXPECT_EQ(TCIMValue(0.0), TCIMValue(-0.0));
     EXPECT_NE(TCIMValue(1.0), TCIMValue(std::nextafter(1.0, 2.0)));
-    EXPECT_EQ(TCIMValue(0.1f).GetReal(), double(0.1f));
+    EXPECT_EQ(TCIMValue(0.1f).GetReal(), static_cast<double>(0.1f));
     EXPECT_EQ(TCIMValue(nan).Hash(), TCIMValue(-nan).Hash());
     EXPECT_EQ(TCIMValue(0.0).Hash(), TCIMValue(-0.0).Hash());
 }
 
 TEST(ValueTest, DatetimesAreComparedAsInstants)
 {
-    EXPECT_EQ(TCIMValue(At("20240101120000.000000+000")), TCIMValue(At("20240101130000.000000+060")));
-    EXPECT_NE(TCIMValue(At("20240101120000.000000+000")), TCIMValue(At("20240101120000.000000+060")));
-    EXPECT_EQ("20240101130000.000000+060", TCIMValue(At("20240101130000.000000+060")).GetDateTime().ToText());
-    EXPECT_EQ("********000000.******:000", TCIMValue(At("********000000.******:000")).GetDateTime().ToText());
+    EXPECT_EQ(TCIMValue(DateTimeOf("20240101120000.000000+000")), TCIMValue(DateTimeOf("20240101130000.000000+060")));
+    EXPECT_NE(TCIMValue(DateTimeOf("20240101120000.000000+000")), TCIMValue(DateTimeOf("20240101120000.000000+060")));
+    EXPECT_EQ("20240101130000.000000+060", TCIMValue(DateTimeOf("20240101130000.000000+060")).GetDateTime().ToText());
+    EXPECT_EQ("********000000.******:000", TCIMValue(DateTimeOf("********000000.******:000")).GetDateTime().ToText());
 }
 
 TEST(ValueTest, ReferencesAreComparedByPathText)
@@ -318,7 +312,7 @@ TEST(ValueTest, EachAccessorAcceptsItsOwnTypesAlone)
 {
     std::string accepted;
     for (const TCIMValue& value : OneOfEachKind()) {
-        accepted += std::to_string(int(value.GetType()));
+        accepted += std::to_string(static_cast<int>(value.GetType()));
         accepted += StatusOf([&] { value.GetBoolean(); }) == 0 ? " boolean" : "";
         accepted += StatusOf([&] { value.GetUnsigned(); }) == 0 ? " unsigned" : "";
         accepted += StatusOf([&] { value.GetSigned(); }) == 0 ? " signed" : "";
@@ -380,7 +374,7 @@ TEST(ValueTest, EqualValuesHashAlike)
     for (std::size_t i = 0; i < values.size(); ++i) {
         EXPECT_EQ(values[i].Hash(), again[i].Hash()) << i;
     }
-    EXPECT_EQ(TCIMValue(At("20240101120000.000000+000")).Hash(), TCIMValue(At("20240101130000.000000+060")).Hash());
+    EXPECT_EQ(TCIMValue(DateTimeOf("20240101120000.000000+000")).Hash(), TCIMValue(DateTimeOf("20240101130000.000000+060")).Hash());
     EXPECT_NE(TCIMValue("a").Hash(), TCIMValue("b").Hash());
     EXPECT_NE(Numbers({1, 2}).Hash(), Numbers({2, 1}).Hash());
 }

@@ -34,9 +34,9 @@ std::string Converted(const TCIMValue& value, TType::ECIMType type)
 }
 
 struct TCase {
-    TType::ECIMType fType;
-    const char* fText;
-    const char* fExpected;
+    TType::ECIMType type;
+    const char* text;
+    const char* expected;
 };
 
 TEST(ValueTextTest, TextBecomesAValueOfItsType)
@@ -74,7 +74,7 @@ TEST(ValueTextTest, TextBecomesAValueOfItsType)
         {TType::kDateTime, " 20240101120000.000000+000 ", "20240101120000.000000+000"},
     };
     for (const TCase& c : cases) {
-        EXPECT_EQ(c.fExpected, Read(c.fType, c.fText)) << int(c.fType) << " " << c.fText;
+        EXPECT_EQ(c.expected, Read(c.type, c.text)) << static_cast<int>(c.type) << " " << c.text;
     }
 }
 
@@ -130,7 +130,7 @@ TEST(ValueTextTest, TextThatDoesNotFitItsTypeIsRefused)
         {TType::kNone, "x", ""},
     };
     for (const TCase& c : cases) {
-        EXPECT_EQ("refused", Read(c.fType, c.fText)) << int(c.fType) << " " << c.fText;
+        EXPECT_EQ("refused", Read(c.type, c.text)) << static_cast<int>(c.type) << " " << c.text;
     }
 }
 
@@ -198,9 +198,9 @@ TEST(ValueTextTest, TypesHaveTheirNames)
 {
     std::string names;
     for (int code = 0; code <= 15; ++code) {
-        const char* const name = TValueText::GetTypeName(TType::ECIMType(code));
+        const char* const name = TValueText::GetTypeName(static_cast<TType::ECIMType>(code));
         names += std::string(name) + " ";
-        EXPECT_EQ(code, int(TValueText::FindType(name)));
+        EXPECT_EQ(code, static_cast<int>(TValueText::FindType(name)));
     }
     EXPECT_EQ(" boolean uint8 sint8 uint16 sint16 uint32 sint32 uint64 sint64 real32 real64 char16 string datetime reference ",
               names);

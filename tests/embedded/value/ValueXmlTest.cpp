@@ -83,7 +83,7 @@ TEST(ValueXmlTest, RealsCarryADecimalPoint)
     EXPECT_EQ("<VALUE>NaN</VALUE>", Xml(TCIMValue(std::numeric_limits<double>::quiet_NaN())));
 }
 
-TEST(ValueXmlTest, PathsTellAsMuchAsTheyKnow)
+TEST(ValueXmlTest, PathsHaveTheElementForWhatTheyKnow)
 {
     const std::string place = "<LOCALNAMESPACEPATH><NAMESPACE NAME=\"root\"/><NAMESPACE NAME=\"cimv2\"/></LOCALNAMESPACEPATH>";
     const std::string name =
@@ -100,7 +100,7 @@ TEST(ValueXmlTest, PathsTellAsMuchAsTheyKnow)
               Xml(TCIMReference::Parse("//web01/root/cimv2:Disk")));
 }
 
-TEST(ValueXmlTest, KeysTellTheirKind)
+TEST(ValueXmlTest, KeysHaveTheirKind)
 {
     TCIMReference path = TCIMReference::Parse("C.a=5,b=TRUE,c='x',d=NULL,e=-1.5");
     path.AddKeyValue("f", TCIMValue(TCIMReference::Parse("D")));
