@@ -1,0 +1,1 @@
+// A target that precompiles a header needs a source.
