@@ -40,7 +40,7 @@ class TKeptConsole : public IConsole {
     std::string fSaid;
 };
 
-struct TOutcome {
+struct TClientOutcome {
     int status;
     std::string result;
     std::string said;
@@ -89,7 +89,7 @@ void Split(std::string_view input, std::vector<std::string>& arguments, TScratch
     }
 }
 
-TOutcome Run(const std::vector<std::string>& arguments, const TScratchFolder::TFiles& files)
+TClientOutcome Run(const std::vector<std::string>& arguments, const TScratchFolder::TFiles& files)
 {
     std::vector<const char*> argv{"cimdelta"};
     for (const std::string& argument : arguments) {
@@ -102,7 +102,7 @@ TOutcome Run(const std::vector<std::string>& arguments, const TScratchFolder::TF
     return {status, console.GetResult(), console.GetSaid(), folder.Read()};
 }
 
-void CheckError(const TOutcome& outcome, const TScratchFolder::TFiles& files)
+void CheckError(const TClientOutcome& outcome, const TScratchFolder::TFiles& files)
 {
     Promise(outcome.result.empty(), "an error writes no result", outcome.result);
     Promise(!outcome.said.empty(), "an error has a message");
@@ -118,12 +118,12 @@ void FuzzArguments(std::string_view input)
     std::vector<std::string> arguments;
     TScratchFolder::TFiles files = fgFiles;
     Split(input, arguments, files);
-    const TOutcome outcome = Run(arguments, files);
+    const TClientOutcome outcome = Run(arguments, files);
     Promise(outcome.status >= 0 && outcome.status <= 2, "the status is 0, 1 or 2", std::to_string(outcome.status));
     if (outcome.status == 2) {
         CheckError(outcome, files);
     }
-    const TOutcome again = Run(arguments, files);
+    const TClientOutcome again = Run(arguments, files);
     Promise(outcome.status == again.status, "the same command gives the same status");
     PromiseEqual(outcome.result, again.result, "the same command writes the same result");
     PromiseEqual(outcome.said, again.said, "the same command writes the same messages");

@@ -16,7 +16,7 @@ namespace NORVZEL20 {
 
 namespace {
 
-struct TOutcome {
+struct TReadOutcome {
     std::string rules;  ///< empty if the text was refused
     std::vector<std::string> log;
     int status = 0;
@@ -50,9 +50,9 @@ std::string Describe(ICIMNamespace& schema, TCIMDiffEngine::TRuleset ruleset)
     return text;
 }
 
-TOutcome Read(const boost::shared_ptr<ICIMNamespace>& schema, std::string text)
+TReadOutcome Read(const boost::shared_ptr<ICIMNamespace>& schema, std::string text)
 {
-    TOutcome outcome;
+    TReadOutcome outcome;
     TLogRecorder log;
     try {
         TCIMDiffEngine::TDiffXMLParser parser(schema);
@@ -71,7 +71,7 @@ bool StartsWith(const std::string& text, const std::string& start)
 }
 
 /// An error in a tag is logged twice, an error of the document once.
-void CheckRefusal(const TOutcome& outcome)
+void CheckRefusal(const TReadOutcome& outcome)
 {
     Promise(outcome.status == TZELStatusCode::kParseError, "a refused text has the status kParseError (9)");
     Promise(outcome.log.size() == 1 || outcome.log.size() == 2, "a refusal is logged once or twice");
@@ -85,7 +85,7 @@ void CheckRefusal(const TOutcome& outcome)
 void FuzzSpecification(std::string_view input)
 {
     static const boost::shared_ptr<ICIMNamespace> fgSchema = LoadSample();
-    const TOutcome outcome = Read(fgSchema, std::string(input));
+    const TReadOutcome outcome = Read(fgSchema, std::string(input));
     if (outcome.rules.empty()) {
         CheckRefusal(outcome);
     } else {

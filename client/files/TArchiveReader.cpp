@@ -18,7 +18,7 @@ namespace NORVZEL20 {
 
 namespace {
 
-const std::size_t kBlockSize = 64 * 1024;
+const std::size_t kArchiveBlockSize = 64 * 1024;
 
 static_assert(std::is_same<la_ssize_t, long>::value, "TArchiveReader::Fill must be an archive_read_callback");
 
@@ -30,7 +30,7 @@ bool Contains(const std::string& text, const char* part)
 }  // namespace
 
 TArchiveReader::TArchiveReader(IByteSource& compressed, const std::string& name, const std::string& kind)
-    : fCompressed(compressed), fName(name), fKind(kind), fBlock(kBlockSize), fArchive(archive_read_new(), &archive_read_free)
+    : fCompressed(compressed), fName(name), fKind(kind), fBlock(kArchiveBlockSize), fArchive(archive_read_new(), &archive_read_free)
 {
     if (!fArchive) {
         throw std::bad_alloc();

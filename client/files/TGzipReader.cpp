@@ -15,7 +15,7 @@ namespace NORVZEL20 {
 namespace {
 
 const char kKind[] = "gzip";
-const std::size_t kBlockSize = 64 * 1024;
+const std::size_t kGzipBlockSize = 64 * 1024;
 const int kLargestWindow = 15;      // the logarithm to base 2
 const int kGzipAlone = 16;          // added to the window: a gzip header is expected, no other
 const Bytef kFirstOfMember = 0x1f;  // of the magic number
@@ -23,7 +23,7 @@ const Bytef kFirstOfMember = 0x1f;  // of the magic number
 }  // namespace
 
 TGzipReader::TGzipReader(IByteSource& compressed, const std::string& name)
-    : fCompressed(compressed), fName(name), fBlock(kBlockSize)
+    : fCompressed(compressed), fName(name), fBlock(kGzipBlockSize)
 {
     if (inflateInit2(&fStream, kLargestWindow + kGzipAlone) != Z_OK) {
         FailForMemory(fName);

@@ -27,7 +27,7 @@ namespace {
 
 using EStatus = TZELStatusCode::EStatusCode;
 
-constexpr std::size_t kPiece = 256 * 1024;
+constexpr std::size_t kReadPiece = 256 * 1024;
 
 struct TFileCloser {
     void operator()(std::FILE* file) const noexcept { std::fclose(file); }
@@ -84,7 +84,7 @@ class TLoad {
         std::size_t room = 0;
         do {
             // Expat reads a tag that has not ended again with each piece. Pieces as long as that tag keep the total linear.
-            room = std::max(kPiece, fXml.GetPending());
+            room = std::max(kReadPiece, fXml.GetPending());
             length = Fill(source, fXml.GetBuffer(room), room);
             total += length;
             Check(fXml.ParseBuffer(length));

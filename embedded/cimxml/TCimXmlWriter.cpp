@@ -20,7 +20,7 @@ namespace NORVZEL20 {
 
 namespace {
 
-constexpr std::size_t kPiece = 64 * 1024;
+constexpr std::size_t kWrittenPiece = 64 * 1024;
 
 using TDecl = ICIMQualifierDecl;
 
@@ -152,7 +152,7 @@ void TCimXmlWriter::WriteElement(const TAppend& append)
         fBuffer.resize(start);
         throw;
     }
-    if (fBuffer.size() >= kPiece) {
+    if (fBuffer.size() >= kWrittenPiece) {
         Flush();
     }
 }

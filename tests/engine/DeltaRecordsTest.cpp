@@ -2,10 +2,10 @@
 
 #include "embedded/services/TAssertionFailure.h"
 #include "host/TAddToVectorCallback.h"
+#include "tests/engine/TBareInstance.h"
 #include "tests/engine/TEngineFixture.h"
 #include "tests/support/Dump.h"
 #include "tests/support/watched/TWatchedClass.h"
-#include "tests/support/watched/TWatchedInstance.h"
 #include "tests/support/watched/TWatchedNamespace.h"
 
 namespace NORVZEL20 {
@@ -174,16 +174,6 @@ class TBareClass : public TWatchedClass {
 
   private:
     boost::shared_ptr<ICIMInstance> fInstance;
-};
-
-// An instance that lacks all its properties.
-class TBareInstance : public TWatchedInstance {
-  public:
-    explicit TBareInstance(boost::shared_ptr<ICIMInstance> instance)
-        : TWatchedInstance(instance, boost::make_shared<TCallWatch>(), "bare", "bare")
-    {}
-
-    boost::shared_ptr<ICIMProperty> GetProperty(const std::string&, TCallContext) const override { return nullptr; }
 };
 
 TEST_P(DeltaRecordsTest, ANullClassFailsTheAssertion)

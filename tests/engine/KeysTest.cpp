@@ -3,6 +3,7 @@
 #include <list>
 
 #include "embedded/services/TAssertionFailure.h"
+#include "tests/engine/TBareInstance.h"
 #include "tests/engine/TEngineFixture.h"
 #include "tests/support/watched/TWatchedClass.h"
 #include "tests/support/watched/TWatchedInstance.h"
@@ -93,16 +94,6 @@ TEST_P(KeysTest, ErrorsOfTheHostPassThrough)
     Watch().FailCallsOf("ns0:Disk.EnumerateKeyNames", TZELStatusCode::kNamespaceGone);
     EXPECT_EQ("status 18", OutcomeOf([&] { Engine().buildPath(RulesWithout(""), disk); }));
 }
-
-// An instance that lacks all its properties.
-class TBareInstance : public TWatchedInstance {
-  public:
-    explicit TBareInstance(boost::shared_ptr<ICIMInstance> instance)
-        : TWatchedInstance(instance, boost::make_shared<TCallWatch>(), "bare", "bare")
-    {}
-
-    boost::shared_ptr<ICIMProperty> GetProperty(const std::string&, TCallContext) const override { return nullptr; }
-};
 
 TEST_P(KeysTest, AKeyPropertyThatIsNullFailsTheAssertion)
 {

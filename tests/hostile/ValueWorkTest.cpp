@@ -11,7 +11,7 @@ namespace NORVZEL20 {
 
 namespace {
 
-constexpr std::size_t kMany = 2000;
+constexpr std::size_t kObjects = 2000;
 
 }  // namespace
 
@@ -19,7 +19,7 @@ constexpr std::size_t kMany = 2000;
 TEST(BagTest, BagsOfObjectsThatDifferInTheirArraysAreComparedInProportion)
 {
     std::vector<TCIMValue> objects;
-    for (unsigned int number = 0; number < kMany; ++number) {
+    for (unsigned int number = 0; number < kObjects; ++number) {
         TEmbeddedObject object("X");
         TEmbeddedObject::TProperty property;
         property.fName = "P";
@@ -28,13 +28,13 @@ TEST(BagTest, BagsOfObjectsThatDifferInTheirArraysAreComparedInProportion)
         objects.emplace_back(boost::make_shared<const TEmbeddedObject>(std::move(object)));
     }
     const auto bagOf = [](const std::vector<TCIMValue>& elements) {
-        return TCIMValue(TCIMValue::TCIMType::kArrayString, kMany, elements).AsBag();
+        return TCIMValue(TCIMValue::TCIMType::kArrayString, kObjects, elements).AsBag();
     };
     const TCIMValue bag = bagOf(objects);
     const TCIMValue reversed = bagOf({objects.rbegin(), objects.rend()});
     TMemoryMeter meter;
     EXPECT_TRUE(bag == reversed);
-    EXPECT_LT(meter.GetTotal(), 1000 * kMany);  // a comparison of two objects allocates
+    EXPECT_LT(meter.GetTotal(), 1000 * kObjects);  // a comparison of two objects allocates
 }
 
 TEST(LikeTest, BracketsThatAreNotClosedAreReadOnce)
