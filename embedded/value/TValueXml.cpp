@@ -59,7 +59,7 @@ void AppendPathElement(std::string& out, const TCIMReference& path)
     out += "</VALUE.REFERENCE>";
 }
 
-void AppendArrayElement(std::string& out, const TCIMValue& element)
+void AppendValueElement(std::string& out, const TCIMValue& element)
 {
     if (element.IsNull()) {
         out += "<VALUE.NULL/>";
@@ -77,7 +77,7 @@ void AppendArray(std::string& out, const TCIMValue& value)
     const bool isOfPaths = value.GetType() == TType::kArrayReference;
     out += isOfPaths ? "<VALUE.REFARRAY>" : "<VALUE.ARRAY>";
     for (const TCIMValue& element : value.GetElements()) {
-        AppendArrayElement(out, element);
+        AppendValueElement(out, element);
     }
     out += isOfPaths ? "</VALUE.REFARRAY>" : "</VALUE.ARRAY>";
 }
@@ -242,7 +242,7 @@ void TValueXml::AppendValue(std::string& out, const TCIMValue& value)
     if (value.GetType().IsArray()) {
         AppendArray(out, value);
     } else {
-        AppendArrayElement(out, value);
+        AppendValueElement(out, value);
     }
 }
 
