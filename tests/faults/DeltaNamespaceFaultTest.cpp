@@ -131,10 +131,11 @@ std::unique_ptr<IFaultyAction> Make()
     return std::make_unique<TAction>();
 }
 
-class OutOfMemory : public testing::TestWithParam<EMode> {
+class TOutOfMemoryFixture : public testing::TestWithParam<EMode> {
   protected:
     std::string NameOf(const std::string& series) const { return series + (GetParam() == EMode::kOnce ? "Once" : "FromThenOn"); }
 };
+using OutOfMemory = TOutOfMemoryFixture;
 
 TEST_P(OutOfMemory, AllocatingADeltaNamespaceLeavesNothing)
 {

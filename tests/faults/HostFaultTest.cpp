@@ -44,7 +44,7 @@ struct TPrepared {
 };
 
 /// A host that fails one call of a run.
-class FailingHost : public testing::TestWithParam<TDiffering> {
+class TFailingHostFixture : public testing::TestWithParam<TDiffering> {
   protected:
     void SetUp() override
     {
@@ -95,6 +95,7 @@ class FailingHost : public testing::TestWithParam<TDiffering> {
     TUntouchedRun fUntouched;
     TRunCalls fCalls;
 };
+using FailingHost = TFailingHostFixture;
 
 TEST_P(FailingHost, PassesOnAnyStatusExceptFromTheCheckOfOperatingSystems)
 {
@@ -110,7 +111,8 @@ INSTANTIATE_TEST_SUITE_P(Faults, FailingHost, testing::ValuesIn(TDiffering::All(
                          [](const auto& test) { return test.param.GetName(); });
 
 /// Lack of memory is a status like any other, so half of the combinations will do.
-class FailingHostWithoutMemory : public FailingHost {};
+class TFailingHostWithoutMemoryFixture : public TFailingHostFixture {};
+using FailingHostWithoutMemory = TFailingHostWithoutMemoryFixture;
 
 TEST_P(FailingHostWithoutMemory, PassesOnItsStatus)
 {

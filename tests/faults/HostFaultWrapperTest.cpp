@@ -17,7 +17,7 @@ namespace {
 using EStatus = TZELStatusCode::EStatusCode;
 
 /// A host that fails one call of those that a walk through wrappers makes.
-class FailingHostOfWrappers : public testing::TestWithParam<EHost> {
+class TFailingHostOfWrappersFixture : public testing::TestWithParam<EHost> {
   protected:
     /// "" or `status 13`; what was seen is in fSeen.
     std::string Walk(TDeltaNamespace& delta)
@@ -101,6 +101,7 @@ class FailingHostOfWrappers : public testing::TestWithParam<EHost> {
 
     std::string fSeen;
 };
+using FailingHostOfWrappers = TFailingHostOfWrappersFixture;
 
 TEST_P(FailingHostOfWrappers, PassesOnAnyStatus)
 {

@@ -141,7 +141,7 @@ class TLoadMore : public IFaultyAction {
     boost::shared_ptr<ICIMNamespace> fNamespace = MakeBase();
 };
 
-class InventoryOutOfMemory : public testing::TestWithParam<EMode> {
+class TInventoryOutOfMemoryFixture : public testing::TestWithParam<EMode> {
   protected:
     std::string FailEach(const std::string& series, TLoadMore::TLoad load)
     {
@@ -151,6 +151,7 @@ class InventoryOutOfMemory : public testing::TestWithParam<EMode> {
         return FailEachAllocation(series + (GetParam() == EMode::kOnce ? "Once" : "FromThenOn"), make, GetParam());
     }
 };
+using InventoryOutOfMemory = TInventoryOutOfMemoryFixture;
 
 TEST_P(InventoryOutOfMemory, LoadingFromMemoryLeavesTheNamespaceAsItWas)
 {
@@ -178,7 +179,7 @@ INSTANTIATE_TEST_SUITE_P(Faults, InventoryOutOfMemory, testing::Values(EMode::kO
                          [](const auto& test) { return test.param == EMode::kOnce ? "Once" : "FromThenOn"; });
 
 /// An inventory that is read with faults.
-class InventorySource : public testing::Test {
+class TInventorySourceFixture : public testing::Test {
   protected:
     /// Loads the file; "" or `status 11`, the error's text in fMessage.
     std::string LoadFile()
@@ -213,6 +214,7 @@ class InventorySource : public testing::Test {
     boost::shared_ptr<ICIMNamespace> fNamespace = MakeBase();
     std::string fMessage;
 };
+using InventorySource = TInventorySourceFixture;
 
 TEST_F(InventorySource, IsReadInWhateverPieces)
 {

@@ -17,7 +17,7 @@ std::vector<std::size_t> NumbersUpTo(std::size_t last)
 }
 
 /// Memory that runs out during a run.
-class RunOutOfMemory : public testing::TestWithParam<TDiffering> {
+class TRunOutOfMemoryFixture : public testing::TestWithParam<TDiffering> {
   protected:
     /// The outcomes; checks that each number of records was left, from none to all.
     std::string FailEach(EMode mode)
@@ -34,6 +34,7 @@ class RunOutOfMemory : public testing::TestWithParam<TDiffering> {
         return outcomes;
     }
 };
+using RunOutOfMemory = TRunOutOfMemoryFixture;
 
 // Before the check of the operating systems, in it, up to the buffer for the specification, that buffer, all the rest.
 const char kOutcomes[] = "bad_alloc, status 3, bad_alloc, status 4, bad_alloc";

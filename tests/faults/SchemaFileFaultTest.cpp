@@ -15,9 +15,9 @@ namespace NORVZEL20 {
 namespace {
 
 /// The file of the delta schema, which every new delta namespace reads.
-class SchemaFile : public testing::Test {
+class TSchemaFileFixture : public testing::Test {
   protected:
-    SchemaFile()
+    TSchemaFileFixture()
     {
         std::ostringstream text;
         text << std::ifstream(fPath, std::ios::binary).rdbuf();
@@ -41,6 +41,7 @@ class SchemaFile : public testing::Test {
     std::string fContents;
     TCapturingLogger fLog;
 };
+using SchemaFile = TSchemaFileFixture;
 
 TEST_F(SchemaFile, IsReadInWhateverPieces)
 {

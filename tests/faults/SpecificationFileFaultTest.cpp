@@ -18,9 +18,9 @@ namespace NORVZEL20 {
 namespace {
 
 /// A specification file that changes, or is read with faults, after its size was asked for.
-class SpecificationFile : public testing::Test {
+class TSpecificationFileFixture : public testing::Test {
   protected:
-    SpecificationFile()
+    TSpecificationFileFixture()
     {
         TNamespaceBuilder builder(fNamespaces[0]);
         FillDiffering(builder.OperatingSystem(), 0);
@@ -72,6 +72,7 @@ class SpecificationFile : public testing::Test {
     std::vector<boost::shared_ptr<ICIMNamespace>> fNamespaces = {MakeNamespace(EHost::kInmem, "root/cimv2")};
     TCIMDiffEngine fEngine{MakeDeltaNamespace(EHost::kInmem), fNamespaces, ""};
 };
+using SpecificationFile = TSpecificationFileFixture;
 
 TEST_F(SpecificationFile, IsReadInWhateverPieces)
 {

@@ -113,7 +113,7 @@ class TOwnedDelta {
 };
 
 /// A thousand runs of one delta namespace, with or without excluded keys.
-class RepeatedRuns : public testing::TestWithParam<bool> {
+class TRepeatedRunsFixture : public testing::TestWithParam<bool> {
   protected:
     static constexpr std::size_t kRuns = 1000;
 
@@ -153,6 +153,7 @@ class RepeatedRuns : public testing::TestWithParam<bool> {
 
     const TSmallComparison fComparison{3, GetParam()};
 };
+using RepeatedRuns = TRepeatedRunsFixture;
 
 TEST_P(RepeatedRuns, AccumulateTheirRecordsExactly)
 {

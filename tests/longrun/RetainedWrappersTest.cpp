@@ -12,7 +12,7 @@ namespace {
 
 /// A wrapper and its delta namespace hold each other: where rules exclude keys, runs make wrappers, and the delta namespace
 /// outlives its last user.
-class RetainedWrappers : public testing::Test {
+class TRetainedWrappersFixture : public testing::Test {
   protected:
     using TWeak = boost::weak_ptr<TDeltaNamespace>;
 
@@ -36,6 +36,7 @@ class RetainedWrappers : public testing::Test {
 
     const TSmallComparison fComparison{3, true};
 };
+using RetainedWrappers = TRetainedWrappersFixture;
 
 TEST_F(RetainedWrappers, KeepTheirDeltaNamespaceAndOneForEachClassAndNamespace)
 {
