@@ -64,7 +64,7 @@ void FillDisks(TNamespaceBuilder& builder, std::size_t index)
     }
 }
 
-/// The keys of a slot, of which bus and shelf are those of the namespace.
+/// The keys of a slot. Bus and shelf depend on the namespace.
 TNamespaceBuilder::TValues KeysOfSlot(std::size_t index, unsigned short number)
 {
     return {{"BusOfTheEnclosure", "a bus with a long name, number " + std::to_string(index)},
@@ -82,7 +82,7 @@ TCIMValue PathOfSlot(std::size_t index, unsigned short number)
     return TCIMValue(path);
 }
 
-/// One slot whose peer differs by its bus and shelf alone, and whose uplink differs by its number; and one more.
+/// Two slots. The peer of the first differs in bus and shelf only, its uplink in the number.
 void FillSlots(TNamespaceBuilder& builder, std::size_t index, EFlaw flaw)
 {
     const auto own = static_cast<unsigned short>(10 + index);

@@ -10,7 +10,7 @@ namespace NORVZEL20 {
 
 /// Small namespaces that differ in every way that a run records.
 
-/// What keeps a run over them from its end.
+/// A flaw that makes a run over them fail.
 enum class EFlaw {
     kNone,
     kNoSlots,          ///< the last namespace lacks the class Slot: status 37 after the records of disks
@@ -18,18 +18,18 @@ enum class EFlaw {
     kUnknownProperty,  ///< the specification names a property that nothing has: status 9 before any record
 };
 
-/// Declares the classes Disk, Ssd (below Disk), Slot and, in namespace 0 alone, Ghost, and fills them as namespace `index` has
-/// them. Of the flaws, those of a namespace count.
+/// Declares the classes Disk, Ssd (below Disk), Slot and, in namespace 0 only, Ghost, and adds the instances of namespace `index`.
+/// Flaws of the rules are ignored here.
 void FillDiffering(TNamespaceBuilder& builder, std::size_t index, EFlaw flaw = EFlaw::kNone);
 
-/// The same classes, as namespace 0 has them, filled like `reference`, whatever runs have made of it.
+/// Declares the classes of namespace 0 and copies all instances of `reference`, with whatever runs have changed in it.
 void FillLike(TNamespaceBuilder& builder, boost::shared_ptr<ICIMNamespace> reference);
 
-/// A specification that compares all of it but the notes of disks and the size of solid ones; with excluded keys, slots are matched
-/// by their number whatever their bus and shelf. Each element `class` stands on a line of its own.
+/// A specification that compares everything except Disk.Note and Ssd.Size. With excluded keys, slots are matched by their number
+/// alone. Each element `class` is on its own line.
 std::string RulesForDiffering(bool excludesKeys, EFlaw flaw = EFlaw::kNone);
 
-/// What the namespace has of each class, as text.
+/// The instances of each class, as text.
 std::string DumpDiffering(boost::shared_ptr<ICIMNamespace> ns);
 
 }  // namespace NORVZEL20

@@ -19,7 +19,7 @@ struct TAttempt {
     std::string outcome;
 };
 
-/// Does the action with its `number`-th allocation failing (0: none).
+/// Runs the action; its `number`-th allocation fails (0: none does).
 TAttempt Attempt(const TMake& make, std::size_t number, TFailingAllocator::EMode mode)
 {
     const auto action = make();

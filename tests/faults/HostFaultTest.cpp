@@ -15,7 +15,7 @@ namespace {
 
 using EStatus = TZELStatusCode::EStatusCode;
 
-/// A comparison of differing namespaces, prepared so that the calls of the run alone are counted.
+/// A prepared comparison of differing namespaces: from here on only the calls of the run are counted.
 struct TPrepared {
     explicit TPrepared(const TDiffering& differing) : comparison(differing.host)
     {
@@ -27,7 +27,7 @@ struct TPrepared {
         comparison.GetWatch().Forget();
     }
 
-    /// "" or `status 37`.
+    /// Returns "", or for example `status 37`.
     std::string Run()
     {
         const std::string outcome = comparison.Run();
@@ -110,7 +110,7 @@ TEST_P(FailingHost, TakesNotFoundForAnAnswerWhereAClassMayBeMissing)
 INSTANTIATE_TEST_SUITE_P(Faults, FailingHost, testing::ValuesIn(TDiffering::All()),
                          [](const auto& test) { return test.param.GetName(); });
 
-/// Lack of memory is a status like any other, so half of the combinations will do.
+/// kOutOfMemory gets no special treatment, so half of the combinations are enough.
 class TFailingHostWithoutMemoryFixture : public TFailingHostFixture {};
 using FailingHostWithoutMemory = TFailingHostWithoutMemoryFixture;
 

@@ -16,10 +16,10 @@ namespace {
 
 using EStatus = TZELStatusCode::EStatusCode;
 
-/// A host that fails one call of those that a walk through wrappers makes.
+/// A host that fails one call of a walk through wrappers.
 class TFailingHostOfWrappersFixture : public testing::TestWithParam<EHost> {
   protected:
-    /// "" or `status 13`; what was seen is in fSeen.
+    /// Returns "", or for example `status 13`. fSeen has what the walk saw.
     std::string Walk(TDeltaNamespace& delta)
     {
         return OutcomeOf([&] { fSeen = See(delta); });
@@ -40,7 +40,7 @@ class TFailingHostOfWrappersFixture : public testing::TestWithParam<EHost> {
     }
 
   private:
-    /// Whether there was such a call.
+    /// Returns whether there was such a call.
     bool FailCall(std::size_t call, EStatus status)
     {
         TComparisonRun comparison(GetParam());
@@ -60,7 +60,7 @@ class TFailingHostOfWrappersFixture : public testing::TestWithParam<EHost> {
         return watch.HasFailed();
     }
 
-    /// What the store does not find is looked for in the compared namespace.
+    /// If the store does not find something, the compared namespace is asked.
     static std::string Expected(const std::string& line, EStatus status)
     {
         const bool isAnswer = status == EStatus::kNotFound && line.compare(0, 15, "store.GetClass(") == 0;

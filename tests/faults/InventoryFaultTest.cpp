@@ -25,7 +25,7 @@ const std::string kHead =
 const std::string kFoot = "</DECLGROUP></DECLARATION></CIM>\n";
 const std::string kKey = "<QUALIFIER NAME='Key' TYPE='boolean'><VALUE>true</VALUE></QUALIFIER>";
 
-/// What is there before: a class and an instance.
+/// The contents before the load: a class and an instance.
 const std::string kBase =
     kHead +
     "<QUALIFIER.DECLARATION NAME='Key' TYPE='boolean'><SCOPE PROPERTY='true' REFERENCE='true'/></QUALIFIER.DECLARATION>\n"
@@ -36,7 +36,7 @@ const std::string kBase =
     "</INSTANCE></VALUE.OBJECT>\n" +
     kFoot;
 
-/// What is loaded: subclasses before their superclass, methods, references, arrays, embedded objects, instances of old and new
+/// The inventory: subclasses before their superclass, methods, references, arrays, embedded objects, instances of old and new
 /// classes.
 const std::string kMore =
     kHead +
@@ -64,7 +64,7 @@ const std::string kMore =
     "heap</VALUE></PROPERTY></INSTANCE></VALUE.OBJECT>\n" +
     kFoot;
 
-/// Everything that the namespace holds.
+/// Everything in the namespace, as text.
 std::string DumpNamespace(boost::shared_ptr<ICIMNamespace> ns)
 {
     const TCallContext none;
@@ -116,7 +116,7 @@ class TPieces {
     std::size_t fPosition = 0;
 };
 
-/// Loads into a namespace that holds something.
+/// Loads into a namespace that is not empty.
 class TLoadMore : public IFaultyAction {
   public:
     using TLoad = std::function<void(boost::shared_ptr<ICIMNamespace>)>;
@@ -178,10 +178,10 @@ TEST_P(InventoryOutOfMemory, PopulatingFromAFileLeavesTheNamespaceAsItWas)
 INSTANTIATE_TEST_SUITE_P(Faults, InventoryOutOfMemory, testing::Values(EMode::kOnce, EMode::kFromThenOn),
                          [](const auto& test) { return test.param == EMode::kOnce ? "Once" : "FromThenOn"; });
 
-/// An inventory that is read with faults.
+/// An inventory from a file with faults.
 class TInventorySourceFixture : public testing::Test {
   protected:
-    /// Loads the file; "" or `status 11`, the error's text in fMessage.
+    /// Loads the file. Returns "", or for example `status 11` with the error's text in fMessage.
     std::string LoadFile()
     {
         fMessage.clear();

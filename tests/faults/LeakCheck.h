@@ -5,7 +5,7 @@
 
 namespace NORVZEL20 {
 
-/// Checks that as many blocks and bytes live, and as many files are open, after the call as before.
+/// Checks that the call leaves no memory allocated and no file open.
 void ExpectNothingLeft(const std::function<void()>& call);
 
 /// How many files the process has open.

@@ -20,7 +20,7 @@ class TLogEntry : public IFaultyAction {
     std::string fEntry = std::string(2000, 'x') + "\n";
 };
 
-/// Sends standard error to a file while it lives.
+/// Redirects standard error to a file while this object lives.
 class TStandardErrorAside {
   public:
     TStandardErrorAside() : fBefore(dup(STDERR_FILENO)) { dup2(fileno(fFile), STDERR_FILENO); }

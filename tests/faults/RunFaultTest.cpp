@@ -16,10 +16,10 @@ std::vector<std::size_t> NumbersUpTo(std::size_t last)
     return numbers;
 }
 
-/// Memory that runs out during a run.
+/// Runs out of memory during a run.
 class TRunOutOfMemoryFixture : public testing::TestWithParam<TDiffering> {
   protected:
-    /// The outcomes; checks that each number of records was left, from none to all.
+    /// Returns the outcomes. Checks that runs left every number of records, from none to all.
     std::string FailEach(EMode mode)
     {
         const TDiffering& differing = GetParam();
@@ -36,7 +36,7 @@ class TRunOutOfMemoryFixture : public testing::TestWithParam<TDiffering> {
 };
 using RunOutOfMemory = TRunOutOfMemoryFixture;
 
-// Before the check of the operating systems, in it, up to the buffer for the specification, that buffer, all the rest.
+// Before the check of the operating systems; in it; up to the buffer for the specification; that buffer; all the rest.
 const char kOutcomes[] = "bad_alloc, status 3, bad_alloc, status 4, bad_alloc";
 
 TEST_P(RunOutOfMemory, OneFailedAllocationEndsItAndTheNextRunIsWhole)

@@ -24,13 +24,13 @@ class TSchemaFileFixture : public testing::Test {
         fContents = text.str();
     }
 
-    /// "" or `status 11`.
+    /// Returns "", or for example `status 11`.
     static std::string Allocate()
     {
         return OutcomeOf([] { TDeltaNamespaceProvider::GetInstance()->AllocateNamespace({}, false, "root/delta"); });
     }
 
-    /// Allocate with the stream in place of the file.
+    /// As Allocate, but the file is `stream`.
     std::string AllocateFrom(TFaultyStream& stream) const
     {
         const TOpenHook hook(fPath, [&stream](const char*) { return stream.Open(); });

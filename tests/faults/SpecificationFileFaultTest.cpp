@@ -17,7 +17,7 @@
 namespace NORVZEL20 {
 namespace {
 
-/// A specification file that changes, or is read with faults, after its size was asked for.
+/// A specification file that changes, or has faults, after the reader has asked for its size.
 class TSpecificationFileFixture : public testing::Test {
   protected:
     TSpecificationFileFixture()
@@ -26,20 +26,20 @@ class TSpecificationFileFixture : public testing::Test {
         FillDiffering(builder.OperatingSystem(), 0);
     }
 
-    /// "" or `status 9`; the rules read are in fRules then.
+    /// Returns "" with the rules in fRules, or for example `status 9`.
     std::string ReadFile()
     {
         return OutcomeOf([this] { fRules = DumpRules(fEngine.ReadSpecFile(fFile.GetPath())); });
     }
 
-    /// ReadFile with the stream in place of the file.
+    /// As ReadFile, but the file is `stream`.
     std::string ReadThrough(TFaultyStream& stream)
     {
         const TOpenHook hook(fFile.GetPath(), [&stream](const char*) { return stream.Open(); });
         return ReadFile();
     }
 
-    /// ReadFile, where the file becomes `contents` between the question for its size and its opening.
+    /// As ReadFile, but the contents change to `contents` after the reader has asked for the size and before it opens the file.
     std::string ReadWhenReplacedBy(const std::string& contents)
     {
         const TOpenHook hook(fFile.GetPath(), [&](const char* mode) {

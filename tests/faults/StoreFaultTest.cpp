@@ -18,7 +18,7 @@ const TCallContext kNone;
 const char kLong[] = "a value that is too long to be held inside";
 const int kDisks = 40;
 
-/// Disks and solid ones, enough of them to make the store tidy up when some go.
+/// Enough disks that the store compacts its extent when some are deleted.
 boost::shared_ptr<ICIMNamespace> MakeDisks()
 {
     TNamespaceBuilder builder(MakeNamespace(EHost::kInmem, "root/cimv2"));
@@ -45,7 +45,7 @@ boost::shared_ptr<ICIMQualifier> KeyQualifier()
     return boost::make_shared<TInMemQualifier>("Key", TCIMValue(true), ICIMQualifierDecl::kFlavorDefault);
 }
 
-/// The instances, with the earlier values of properties that were marked as changed.
+/// The instances, with the former values of properties that were marked as changed.
 std::string DumpStore(boost::shared_ptr<ICIMNamespace> ns)
 {
     std::string text = DumpInstances(ns, "Disk") + DumpInstances(ns, "Ssd");
@@ -69,7 +69,7 @@ std::vector<boost::shared_ptr<ICIMInstance>> InstancesOf(ICIMClass& cls)
     return instances;
 }
 
-/// One change of a store, made wholly or not at all.
+/// One change to a store, which is made completely or not at all.
 class TChangeStore : public IFaultyAction {
   public:
     explicit TChangeStore(TChange change) : fChange(change), fBefore(DumpStore(fStore)) {}
@@ -183,7 +183,7 @@ TEST(StoreOutOfMemory, RemovingAPropertyOfAClassInUseRemovesItOrNot)
               }));
 }
 
-/// Keys that came late make each instance allocate when it is found anew.
+/// If a class gets keys late, each instance allocates when it is indexed again.
 TEST(StoreOutOfMemory, FindingByKeysThatHaveChangedFindsOrFails)
 {
     const auto store = MakeDisks();

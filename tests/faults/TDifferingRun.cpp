@@ -26,7 +26,7 @@ boost::shared_ptr<ICIMNamespace> MakeWithOperatingSystem(const TDiffering& diffe
     return TNamespaceBuilder(MakeNamespace(differing.host, "root/cimv2")).OperatingSystem().GetNamespace();
 }
 
-/// Runs over them with namespace 0 given, the others new.
+/// Runs over `reference` as namespace 0 and new other namespaces.
 TUntouchedRun RunOver(const TDiffering& differing, boost::shared_ptr<ICIMNamespace> reference)
 {
     const TScratchFile rules(RulesForDiffering(differing.excludesKeys, differing.flaw));
@@ -57,7 +57,7 @@ TUntouchedRun RunOverCopy(const TDiffering& differing, boost::shared_ptr<ICIMNam
     return RunOver(differing, copy.GetNamespace());
 }
 
-/// The lines of both texts, each once, in ascending order.
+/// The lines of both texts, sorted, without duplicates.
 std::string Together(const std::string& one, const std::string& other)
 {
     std::set<std::string> lines;

@@ -20,7 +20,7 @@ struct TOrder {
 };
 thread_local TOrder gOrder;
 
-/// Whether the allocation at hand is to fail.
+/// Counts an allocation. Returns whether it has to fail.
 bool IsToFail() noexcept
 {
     TOrder& order = gOrder;
@@ -38,7 +38,8 @@ bool IsToFail() noexcept
     return true;
 }
 
-/// The size stands in front of the memory handed out, in a head as long as the alignment needs it.
+/// Each block starts with a head that ends with its size. The head is as long as the alignment, so that the memory after it is
+/// aligned.
 std::size_t HeadLength(std::size_t alignment) noexcept
 {
     return std::max(alignment, alignof(std::max_align_t));

@@ -4,11 +4,11 @@
 
 namespace NORVZEL20 {
 
-/// The memory of a program that has this file among its sources: it counts what lives, and can make an allocation fail.
+/// Counts the memory in use, and can make an allocation fail.
 ///
-/// Takes the place of every form of operator new and delete, in the program and in its shared libraries, and of the memory
-/// functions of the XML library. What C libraries take from malloc by themselves is not seen.
-/// Threads: counts are of the whole program; what is to fail is each thread's own.
+/// A program that is linked with this file uses it for every form of operator new and delete, in its shared libraries too, and for
+/// the memory functions of the XML library. It does not see what C libraries take from malloc. Threads: the counts are for the
+/// whole program. Each thread orders its own failures.
 class TFailingAllocator {
   public:
     enum class EMode {
@@ -22,18 +22,18 @@ class TFailingAllocator {
 
     TFailingAllocator() = delete;
 
-    /// From now on the `number`-th allocation of this thread (from 1) fails, until Stop.
+    /// Makes the `number`-th allocation of this thread fail, counted from 1 and from now. Stop cancels it.
     static void Fail(std::size_t number, EMode mode = EMode::kOnce) noexcept;
     static void Stop() noexcept;
-    /// Whether Fail's allocation has come.
+    /// Whether the allocation that Fail ordered has failed.
     static bool HasFailed() noexcept;
 
-    /// What lives now.
+    /// What is allocated now.
     static TUsage GetLive() noexcept;
 
-    /// What operator new does, without an exception: null where the allocation fails.
+    /// As operator new, but returns null if the allocation fails.
     static void* Allocate(std::size_t size, std::size_t alignment = alignof(std::max_align_t)) noexcept;
-    /// `memory` may be null. The same alignment as when it was allocated.
+    /// `memory` may be null. `alignment` must be that of its allocation.
     static void Free(void* memory, std::size_t alignment = alignof(std::max_align_t)) noexcept;
     /// As std::realloc.
     static void* Reallocate(void* memory, std::size_t size) noexcept;

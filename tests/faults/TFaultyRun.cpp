@@ -40,7 +40,7 @@ void TFaultyRun::Verify(const std::string& outcome)
     ExpectThatAnotherRunIsWhole(fDiffering, fCompared, fExpected);
 }
 
-/// What the untouched run logs is there, or not, or ends with an entry: an entry is never cut.
+/// The log is that of the untouched run, or the start of it. An entry is never cut.
 void TFaultyRun::VerifyLog(const std::string& outcome)
 {
     const std::string log = fLog.Take();

@@ -11,16 +11,16 @@
 
 namespace NORVZEL20 {
 
-/// A run over differing namespaces, to be done while memory runs out.
+/// A run over differing namespaces while memory runs out.
 class TFaultyRun : public IFaultyAction {
   public:
-    /// How many records Act leaves is appended to `left`, unless it is as many as stand there last or it passes the first times.
+    /// Verify appends the number of records that Act left to `left`, unless that is its last entry or the run is a warm-up.
     TFaultyRun(const TDiffering& differing, const TUntouchedRun& expected, std::vector<std::size_t>& left);
     ~TFaultyRun() override;
 
     void Act() override;
-    /// Checks that the log is whole, that the records written are the first ones of the untouched run, that the delta namespace
-    /// answers, and that another run is whole.
+    /// Checks that no log entry is cut, that the records are the first ones of the untouched run, that the delta namespace still
+    /// works, and that another run is complete.
     void Verify(const std::string& outcome) override;
 
   private:

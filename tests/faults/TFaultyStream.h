@@ -6,19 +6,19 @@
 
 namespace NORVZEL20 {
 
-/// A file that is read with faults: in small pieces, with an error in its middle.
+/// A file that delivers small pieces, or an error in its middle.
 class TFaultyStream {
   public:
     static constexpr std::size_t kNever = std::numeric_limits<std::size_t>::max();
 
-    /// At most `pieceLength` bytes come at a time; reading from offset `errorAt` on fails with EIO, `errors` times.
+    /// Delivers at most `pieceLength` bytes at a time. Reads at or after offset `errorAt` fail with EIO, `errors` times.
     TFaultyStream(std::string contents, std::size_t pieceLength, std::size_t errorAt = kNever, int errors = 1000);
     TFaultyStream(const TFaultyStream&) = delete;
     TFaultyStream& operator=(const TFaultyStream&) = delete;
-    /// Closes the file where nobody has.
+    /// Closes the file if it is still open.
     ~TFaultyStream();
 
-    /// To be called once.
+    /// Call this once.
     std::FILE* Open();
     bool IsOpen() const { return fFile != nullptr; }
 

@@ -40,7 +40,7 @@ std::FILE* TOpenHook::Open(const char* path, const char* mode)
 
 }  // namespace NORVZEL20
 
-// Found before the C library's own function of that name.
+// The program's own function, which the linker prefers to the C library's.
 extern "C" std::FILE* fopen(const char* path, const char* mode)
 {
     return NORVZEL20::TOpenHook::Open(path, mode);

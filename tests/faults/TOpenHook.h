@@ -6,9 +6,9 @@
 
 namespace NORVZEL20 {
 
-/// While it lives, std::fopen of one path does something else, in a program that has this file among its sources.
+/// Replaces std::fopen for one path while this object lives. The program must be linked with this file.
 ///
-/// Threads: one; one hook at a time.
+/// Threads: one. Only one hook may exist at a time.
 class TOpenHook {
   public:
     using TOpen = std::function<std::FILE*(const char* mode)>;
@@ -21,9 +21,9 @@ class TOpenHook {
     /// How often the path was opened.
     int GetCount() const { return fCount; }
 
-    /// What std::fopen does without a hook.
+    /// std::fopen without the hook.
     static std::FILE* OpenReally(const char* path, const char* mode);
-    /// What std::fopen does.
+    /// std::fopen with the hook.
     static std::FILE* Open(const char* path, const char* mode);
 
   private:

@@ -16,7 +16,7 @@ bool Contains(const std::string& text, const std::string& part)
     return text.find(part) != std::string::npos;
 }
 
-/// What stands between the first two quotes.
+/// The text between the first two quotes.
 std::string QuotedIn(const std::string& line)
 {
     const std::size_t begin = line.find('"') + 1;
@@ -98,13 +98,14 @@ TRunCalls::EPhase TRunCalls::PhaseOf(std::size_t call) const
     return Contains(GetLine(call) + GetLine(call + 1), ".GetPropertyDecl(") ? kValueTag : kPushingDown;
 }
 
-/// A start tag asks for its class and nothing of it; a value's property or the class's subclasses are asked for at once.
+/// After a start tag the next call is for another class. A value's end tag asks for a property next, the last end tag for
+/// subclasses.
 bool TRunCalls::IsOfClassTag(std::size_t call) const
 {
     return Contains(GetLine(call), ".GetClass(\"") && Contains(GetLine(call + 1), ".GetClass(\"");
 }
 
-/// The number of the line on which the class element stands that is being read.
+/// The line of the class element that is being read.
 std::string TRunCalls::LineInRules(std::size_t call) const
 {
     while (!IsOfClassTag(call)) {
@@ -119,7 +120,7 @@ std::string TRunCalls::PropertyOf(std::size_t call) const
     return QuotedIn(GetLine(Contains(GetLine(call), ".GetPropertyDecl(") ? call : call + 1));
 }
 
-/// "Not found" is an answer to some calls.
+/// To some calls, kNotFound (15) is an answer and not a failure.
 TRunCalls::TEnd TRunCalls::WhenNotFound(std::size_t call) const
 {
     const EPhase phase = PhaseOf(call);
@@ -132,8 +133,8 @@ TRunCalls::TEnd TRunCalls::WhenNotFound(std::size_t call) const
     return {OutcomeWith(EStatus::kParseError), FatalError(line, error) + PassedOn(line, phase == kClassTag, EStatus::kParseError)};
 }
 
-/// The store may lack a class, which is asked for elsewhere where there is an index; a namespace may lack a class of which the
-/// reference has no instances, as of Ghost.
+/// The store may lack a class; if the context has an index, the compared namespace is asked instead. A namespace may lack a class
+/// without instances in the reference, such as Ghost.
 TRunCalls::TEnd TRunCalls::WhenNotFoundComparing(const std::string& line) const
 {
     const bool hasIndex = Contains(line, "nsIndex");

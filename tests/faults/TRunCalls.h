@@ -8,8 +8,8 @@
 
 namespace NORVZEL20 {
 
-/// The calls that an untouched run over differing namespaces makes, as TCallWatch tells them, and what is to come of a run when
-/// one of them fails. Knows nothing of any run that failed. Calls count from 1.
+/// Predicts how a run ends if one of its host calls fails, from the calls that an untouched run makes. It never sees a run that
+/// failed. Calls count from 1.
 class TRunCalls {
   public:
     using EStatus = TZELStatusCode::EStatusCode;
@@ -21,19 +21,20 @@ class TRunCalls {
     };
 
     TRunCalls() = default;
-    /// `lines` as TCallWatch::GetText tells them, made under the specification `rules`.
+    /// `lines`: the text of TCallWatch::GetText after an untouched run with the specification `rules`.
     TRunCalls(const std::string& lines, const std::string& rules);
 
     std::size_t GetCount() const { return fLines.size(); }
-    /// The call's line; "none" after the last one.
+    /// The line of the call, or "none" if there is no such call.
     std::string GetLine(std::size_t call) const;
-    /// How many records have been added before the call.
+    /// How many records the run has added before the call.
     std::size_t CountRecordsBefore(std::size_t call) const;
-    /// How the run ends when the call fails with that status.
+    /// How the run ends if the call fails with that status.
     TEnd WhenFails(std::size_t call, EStatus status) const;
 
   private:
-    /// Where the run is. Specification: in a class's start tag, in a value's end tag, in the end tag that pushes rules down.
+    /// What the run is doing. It reads the specification in three places: a class's start tag, a value's end tag, and the end tag
+    /// that pushes rules down.
     enum EPhase { kOperatingSystems, kClassTag, kValueTag, kPushingDown, kComparing };
 
     EPhase PhaseOf(std::size_t call) const;

@@ -19,8 +19,8 @@ std::string RecordText(const ICIMInstance& record)
            ValueOf(record, "Property").ToText() + " " + ValueOf(record, "NamespaceIndices").ToText();
 }
 
-/// Puts the three kinds of records back into the order of writing: a class record stands before the first record that is tied to
-/// it; one that nothing is tied to stands before the loose record, or else the class, that comes next.
+/// Merges the three kinds of records into the order of writing. A class record comes before the first record that is tied to it. A
+/// class record without records comes before the next loose record, or else before the next class record.
 class TTrace {
   public:
     explicit TTrace(boost::shared_ptr<ICIMNamespace> store)

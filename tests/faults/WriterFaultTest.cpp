@@ -11,7 +11,7 @@ namespace {
 
 const TCallContext kNone;
 
-/// An instance of a host that tells some of its properties and then fails.
+/// An instance that fails after it has delivered some of its properties.
 class TBrokenInstance : public ICIMInstance {
   public:
     TBrokenInstance(boost::shared_ptr<ICIMInstance> instance, int told) : fInstance(instance), fTold(told) {}
@@ -63,7 +63,7 @@ TEST(WriterFaults, AnInstanceThatTheHostCannotTellIsLeftOutWhole)
     }
 }
 
-/// Writes a namespace whole; after a failure the same writer writes it again.
+/// Writes a whole namespace. After a failure the same writer writes it again.
 class TWriteNamespace : public IFaultyAction {
   public:
     explicit TWriteNamespace(boost::shared_ptr<ICIMNamespace> ns) : fNamespace(ns)

@@ -26,7 +26,7 @@ void Free(void* memory)
 
 }  // namespace
 
-// Found before the library's own function of that name: its parsers take their memory from here.
+// The linker prefers this function to the library's own, so parsers take their memory from here.
 XML_Parser XML_ParserCreate(const XML_Char* encoding)
 {
     static const XML_Memory_Handling_Suite suite = {Allocate, Reallocate, Free};

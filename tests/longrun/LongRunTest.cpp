@@ -19,7 +19,7 @@ using TUsage = TFailingAllocator::TUsage;
 const int kManyRuns = 10000;
 const int kWarmUp = 100;
 
-/// Takes the place of the core log while it lives, and keeps nothing.
+/// Replaces the core log while it lives, and drops all entries.
 class TQuietLogger : public ILogger {
   public:
     TQuietLogger() : fBefore(TCoreLog::Set(this)) {}
@@ -44,7 +44,7 @@ std::size_t CountInstances(TDeltaNamespace& delta, const std::string& className)
     return count;
 }
 
-/// Does `run` again and again; after the first hundred, as much must live after each as after the one before.
+/// Repeats `run`. After the first hundred times, the memory in use must not change any more.
 template <class TRun>
 void ExpectFlat(const std::string& name, int runs, TRun run)
 {
@@ -96,7 +96,7 @@ TEST(LongRun, FailingRunsLeaveNothing)
     });
 }
 
-/// A delta namespace whose wrappers are forgotten in the end, so that it goes.
+/// A delta namespace that forgets its wrappers in the end, because they would keep it alive.
 class TOwnedDelta {
   public:
     explicit TOwnedDelta(const TSmallComparison& comparison) : fDelta(comparison.MakeDelta()) {}
@@ -117,7 +117,7 @@ class TRepeatedRunsFixture : public testing::TestWithParam<bool> {
   protected:
     static constexpr std::size_t kRuns = 1000;
 
-    /// Does `act` that often.
+    /// Repeats `act` that often.
     template <class TAct>
     static void Repeat(std::size_t times, TAct act)
     {
@@ -126,7 +126,8 @@ class TRepeatedRunsFixture : public testing::TestWithParam<bool> {
         }
     }
 
-    /// What lives more after a thousand times than before; with excluded keys, than after the first, which makes the wrappers.
+    /// Returns by how much the memory in use grows in a thousand runs. With excluded keys the first run is not counted: it makes
+    /// the wrappers.
     template <class TAct>
     static TUsage MeasureGrowth(TAct act)
     {
@@ -144,7 +145,7 @@ class TRepeatedRunsFixture : public testing::TestWithParam<bool> {
         return MeasureGrowth([&delta] { delta->FindDifferences(); });
     }
 
-    /// MeasureRuns of the same records without any run.
+    /// As MeasureRuns, but the records are written without a run.
     TUsage MeasureWriting(const TRecordWriter& writer) const
     {
         const TOwnedDelta delta(fComparison);

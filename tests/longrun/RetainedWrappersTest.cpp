@@ -10,13 +10,13 @@
 namespace NORVZEL20 {
 namespace {
 
-/// A wrapper and its delta namespace hold each other: where rules exclude keys, runs make wrappers, and the delta namespace
-/// outlives its last user.
+/// A wrapper and its delta namespace own each other. If rules exclude keys, runs make wrappers, and the delta namespace outlives
+/// its last user.
 class TRetainedWrappersFixture : public testing::Test {
   protected:
     using TWeak = boost::weak_ptr<TDeltaNamespace>;
 
-    /// Runs once on a delta namespace that nobody holds any more afterwards.
+    /// Runs once on a delta namespace and releases it.
     TWeak RunAndLetGo() const
     {
         const auto delta = fComparison.MakeDelta();
@@ -24,7 +24,7 @@ class TRetainedWrappersFixture : public testing::Test {
         return delta;
     }
 
-    /// RunAndLetGo, and how many bytes live more than before.
+    /// As RunAndLetGo. Returns by how many bytes the memory in use has grown.
     std::size_t MeasureRetained(TWeak& delta) const
     {
         const std::size_t before = TFailingAllocator::GetLive().bytes;

@@ -8,13 +8,13 @@
 
 namespace NORVZEL20 {
 
-/// Writes delta records as a run does, without a run: copies of what another delta namespace holds.
+/// Writes delta records as a run does, but copies them from another delta namespace.
 class TRecordWriter {
   public:
-    /// Reads the records that `source` holds.
+    /// Reads the records of `source`.
     explicit TRecordWriter(boost::shared_ptr<ICIMNamespace> source);
 
-    /// Adds a copy of each to `target`, in their order.
+    /// Adds a copy of each record to `target`, in the same order.
     void WriteInto(ICIMNamespace& target) const;
 
   private:

@@ -9,7 +9,7 @@
 
 namespace NORVZEL20 {
 
-/// Small namespaces of the embedded host that differ, their rules, and delta namespaces made for them.
+/// Small differing namespaces of the embedded host, with rules and delta namespaces for them.
 class TSmallComparison {
   public:
     TSmallComparison(std::size_t namespaces, bool excludesKeys) : fRules(RulesForDiffering(excludesKeys))

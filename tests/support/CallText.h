@@ -8,13 +8,13 @@
 
 namespace NORVZEL20 {
 
-/// The parts of a call's line.
+/// Texts for the lines of recorded calls.
 
-/// " {}" for an empty context, else " {name=value, ...}".
+/// Returns " {}" for an empty context, otherwise " {name=value, ...}".
 std::string ContextText(const TCallContext& context);
-/// The text in double quotes, nothing escaped.
+/// The text in double quotes, without escapes.
 std::string Quoted(const std::string& text);
-/// A value with its text in quotes, so that NULL and "NULL" differ.
+/// The text of a value; texts are quoted, so NULL and "NULL" differ.
 std::string ValueText(const TCIMValue& value);
 std::string FlagText(bool flag);
 

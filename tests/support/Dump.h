@@ -7,7 +7,7 @@
 
 namespace NORVZEL20 {
 
-/// One text form for what tests compare.
+/// Text forms for what tests compare.
 
 /// A class with its rules: `Disk include final A:EXCLUDE B:INCLUDE -Key1 -Key2`, a line for each.
 std::string DumpRules(const TCIMDiffEngine::TRuleset& ruleset);
@@ -18,10 +18,10 @@ std::string DumpRules(const TCIMDiffEngine::TDiffClassRules& rules);
 ///     Disk
 ///       4 Disk.Id="sda" Size [1]
 ///
-/// Reads each record through the association that ties it to its class, and tells of records that nothing ties ("loose").
+/// Reads each record through the association that ties it to its class. Records without an association are marked "loose".
 std::string DumpRecords(boost::shared_ptr<ICIMNamespace> store);
 
-/// The instances of the class, `Disk.Id="sda" Size=5` for each, in the host's order; inherited ones are not shown.
+/// The instances of exactly this class, `Disk.Id="sda" Size=5` for each, in the host's order.
 std::string DumpInstances(boost::shared_ptr<ICIMNamespace> ns, const std::string& className);
 
 /// The aliases that the delta namespace's wrappers hold: `1:Disk alias -> path` for each.

@@ -6,7 +6,7 @@ namespace NORVZEL20 {
 
 TCapturingLogger::TCapturingLogger() : fBefore(TCoreLog::Set(this))
 {
-    fText.reserve(4096);  // so that there is room where a test leaves no memory
+    fText.reserve(4096);  // room for tests that run out of memory
 }
 
 TCapturingLogger::~TCapturingLogger()

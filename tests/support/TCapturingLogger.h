@@ -6,8 +6,7 @@
 
 namespace NORVZEL20 {
 
-/// Takes the place of the core log while it lives, and keeps what is written: `level|message|` for each entry, line ends as
-/// written.
+/// Replaces the core log while it lives. Keeps each entry as `level|message|`, with its line ends.
 class TCapturingLogger : public ILogger {
   public:
     TCapturingLogger();

@@ -13,22 +13,22 @@
 
 namespace NORVZEL20 {
 
-/// Whose namespaces a test uses.
+/// The host that provides the namespaces of a test.
 enum class EHost {
-    kPlain,  ///< those of tests/support, which check nothing
-    kInmem   ///< those of the embedded host's provider "inmem"
+    kPlain,  ///< tests/support/plain, which checks nothing
+    kInmem   ///< the embedded host's provider "inmem"
 };
 
 std::ostream& operator<<(std::ostream& out, EHost host);
 
 /// A new, empty namespace.
 boost::shared_ptr<ICIMNamespace> MakeNamespace(EHost host, const std::string& name);
-/// A delta namespace with its schema: with kPlain around a plain store, with kInmem the provider's own.
+/// A delta namespace with its schema. With kPlain its store is a plain namespace, with kInmem the provider makes it.
 boost::shared_ptr<TDeltaNamespace> MakeDeltaNamespace(EHost host);
 
-/// A delta namespace, the namespaces it compares, and its specification, all watched.
+/// A delta namespace with the namespaces that it compares and its specification. All are watched.
 ///
-/// The namespaces are made as they are named, each with KALMO_OperatingSystem; they join the compare list at the first run.
+/// A namespace is made when it is first asked for, with KALMO_OperatingSystem. All join the compare list at the first run.
 class TComparisonRun {
   public:
     explicit TComparisonRun(EHost host);
@@ -36,24 +36,24 @@ class TComparisonRun {
     TComparisonRun& operator=(const TComparisonRun&) = delete;
     ~TComparisonRun();
 
-    /// The namespace at that position; made, with all before it, where it is not there yet.
+    /// The namespace at that position. Makes it, and all before it, if they are missing.
     TNamespaceBuilder& Namespace(std::size_t index);
-    /// Positions to be, where no builder is asked for.
+    /// How many namespaces to make if the test asks for fewer.
     void SetNamespaceCount(std::size_t count);
-    /// Whether namespaces to come get KALMO_OperatingSystem.
+    /// Whether namespaces that are made later get KALMO_OperatingSystem.
     void SetWithOperatingSystem(bool with) { fWithOperatingSystem = with; }
 
-    /// Sets the specification to this text, kept in a file.
+    /// Writes the text to a file and makes it the specification.
     void Rules(const std::string& xml);
     const std::string& GetRulesPath() const;
 
     /// Adds the namespaces to the compare list.
     void Prepare();
-    /// Prepares, and finds the differences: "", or `status 37` for an exception with that status.
+    /// Prepares and finds the differences. Returns "", or for example `status 37` for an exception.
     std::string Run();
     /// The records in the store.
     std::string Records() const;
-    /// Run and Records one after the other, a status last.
+    /// Calls Run, then Records. A status comes last in the text.
     std::string RecordsAfterRun();
 
     TCallWatch& GetWatch() { return *fWatch; }

@@ -9,7 +9,7 @@
 
 namespace NORVZEL20 {
 
-/// Fills any namespace with classes and instances, through the host's interface alone.
+/// Fills any namespace with classes and instances, through the host's interfaces only.
 class TNamespaceBuilder {
   public:
     /// A property to declare.
@@ -29,11 +29,11 @@ class TNamespaceBuilder {
 
     /// Declares a class; an empty `superName` makes a top-level one.
     TNamespaceBuilder& Class(const std::string& name, const std::string& superName, const std::vector<TProperty>& properties);
-    /// Adds an instance; what `values` does not name stays null.
+    /// Adds an instance. Properties that `values` does not name stay null.
     TNamespaceBuilder& Instance(const std::string& className, const TValues& values);
-    /// KALMO_OperatingSystem with one instance of that OSType.
+    /// Declares KALMO_OperatingSystem and adds one instance with this OSType.
     TNamespaceBuilder& OperatingSystem(unsigned short osType = 36);
-    /// The three classes of the delta records.
+    /// Declares the three classes of delta records.
     TNamespaceBuilder& DeltaSchema();
 
   private:

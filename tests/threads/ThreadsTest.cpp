@@ -20,7 +20,7 @@ namespace {
 
 const std::size_t kThreads = 8;
 
-/// Lets threads go on when all of them are there.
+/// A barrier: threads wait until all have arrived.
 class TStartLine {
   public:
     void Wait()
@@ -38,7 +38,7 @@ class TStartLine {
     std::size_t fWaiting = 0;
 };
 
-/// What each of eight threads made, all of them at work at once.
+/// Runs `work` on eight threads at the same time and returns their results.
 std::vector<std::string> DoAtOnce(const std::function<std::string()>& work)
 {
     TStartLine start;
@@ -56,8 +56,8 @@ std::vector<std::string> DoAtOnce(const std::function<std::string()>& work)
     return results;
 }
 
-/// Checks that threads at once make what one makes alone. The one comes last, so that nothing is ready when they begin but the
-/// provider: its first use is for one thread alone, and the load of its library makes it.
+/// Checks that eight concurrent threads get the same results as one alone. The single thread comes last, so the threads start with
+/// nothing initialised except the provider. Its first use must be on one thread, and loading its library is that use.
 void ExpectAsAlone(const std::function<std::string()>& work)
 {
     const std::vector<std::string> results = DoAtOnce(work);
@@ -66,7 +66,7 @@ void ExpectAsAlone(const std::function<std::string()>& work)
     EXPECT_EQ(std::vector<std::string>(kThreads, alone), results);
 }
 
-/// Counts entries, from any thread.
+/// Counts entries from all threads.
 class TCountingLogger : public ILogger {
   public:
     TCountingLogger() : fBefore(TCoreLog::Set(this)) {}
@@ -82,7 +82,7 @@ class TCountingLogger : public ILogger {
     std::atomic<std::size_t> fCount{0};
 };
 
-/// A few runs of a delta namespace over namespaces of its own; the records and what became of the reference.
+/// Runs a delta namespace over its own namespaces a few times. Returns the records and the reference as text.
 std::string Compare(std::size_t namespaces, const std::string& rules)
 {
     std::string text;

@@ -13,8 +13,8 @@ namespace NORVZEL20 {
 class TPlainNamespace;
 class TPlainPropertyDecl;
 
-/// A class of the plain host: names byte for byte, everything in the order it was added; what no test needs is refused with
-/// status 31.
+/// A class of the plain host. Names are compared byte for byte; everything stays in the order in which it was added. Operations
+/// that no test needs throw kNotSupported (31).
 class TPlainClass : public ICIMClass, public boost::enable_shared_from_this<TPlainClass> {
   public:
     TPlainClass(std::string name, boost::shared_ptr<TPlainNamespace> ns, boost::shared_ptr<TPlainClass> superClass);
@@ -39,7 +39,7 @@ class TPlainClass : public ICIMClass, public boost::enable_shared_from_this<TPla
     void EnumerateSubClasses(const boost::function<bool(boost::shared_ptr<ICIMClass>)>& callback, bool deep,
                              TCallContext context) override;
     bool IsSubclassOf(boost::shared_ptr<const ICIMClass> cls, TCallContext context) const override;
-    /// Delivers the subclasses, so that a test can see that they pass through.
+    /// Delivers the subclasses, for tests of forwarding.
     void EnumerateAssociatedClasses(const boost::function<bool(boost::shared_ptr<ICIMClass>)>& callback,
                                     const std::string& associationClass, const std::string& resultClass, const std::string& role,
                                     const std::string& resultRole, TCallContext context) override;

@@ -12,8 +12,8 @@ class TPlainProperty;
 
 /// An instance of the plain host.
 ///
-/// Nothing is checked when it is added: equal keys and null keys are taken. A null key of type uint64 gets the next number of
-/// the class, so that records of equal contents stay apart. The path is the one it was added with.
+/// Adding it checks nothing, so equal keys and null keys are accepted. A null key of type uint64 gets the next number of the class,
+/// which keeps records with equal contents apart. The path does not change after that.
 class TPlainInstance : public ICIMInstance, public boost::enable_shared_from_this<TPlainInstance> {
   public:
     explicit TPlainInstance(boost::shared_ptr<TPlainClass> cls);

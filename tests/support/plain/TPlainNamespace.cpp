@@ -15,7 +15,7 @@ namespace {
     throw TZELException(TZELStatusCode::kNotSupported);
 }
 
-// The path without the namespace, which a caller may have left out.
+// The path without the namespace, because callers may leave it out.
 std::string LocalPath(TCIMReference path)
 {
     path.SetNamespaceName("");

@@ -11,14 +11,14 @@ namespace NORVZEL20 {
 
 class TPlainClass;
 
-/// A namespace as simple as one can be, independent of the embedded host: it keeps what it is given, in order, and checks nothing.
+/// The simplest possible namespace, independent of the embedded host. It keeps what it is given, in order, and checks nothing.
 ///
-/// So it also holds what a real store refuses: several instances with the same keys, keys without a value, values of another
-/// type than declared. Names are compared byte for byte. What no test needs is refused with status 31.
+/// Unlike a real store it accepts several instances with the same keys, keys without a value, and values of another type than
+/// declared. Names are compared byte for byte. Operations that no test needs throw kNotSupported (31).
 class TPlainNamespace : public ICIMNamespace, public boost::enable_shared_from_this<TPlainNamespace> {
   public:
     static boost::shared_ptr<TPlainNamespace> Create(const std::string& name);
-    /// Drops all instances, which otherwise keep their classes alive, and are kept by them.
+    /// Drops all instances, because instances and classes own each other.
     ~TPlainNamespace() override;
 
     const std::string& GetName() const { return fName; }

@@ -4,7 +4,7 @@
 
 namespace NORVZEL20 {
 
-/// A property of the plain host: takes any value, and counts how often it was marked.
+/// A property of the plain host. It accepts any value and counts how often it was marked.
 class TPlainProperty : public ICIMProperty {
   public:
     explicit TPlainProperty(boost::shared_ptr<const ICIMPropertyDecl> decl);

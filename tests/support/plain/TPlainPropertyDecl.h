@@ -7,7 +7,7 @@
 
 namespace NORVZEL20 {
 
-/// A property declaration of the plain host. It is a key once a qualifier "Key" was put on it.
+/// A property declaration of the plain host. A qualifier "Key" makes it a key.
 class TPlainPropertyDecl : public ICIMPropertyDecl {
   public:
     TPlainPropertyDecl(std::string name, TCIMValue defaultValue);

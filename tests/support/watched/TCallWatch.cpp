@@ -11,7 +11,7 @@ namespace NORVZEL20 {
 
 namespace {
 
-// The library or program that holds the address, as the loader knows it; dladdr would look for the nearest symbol as well.
+// The library or program that contains the address. dladdr would also search for the nearest symbol, which takes longer.
 const void* HolderOf(const void* address)
 {
     dl_find_object found;

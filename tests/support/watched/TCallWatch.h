@@ -8,30 +8,30 @@
 
 namespace NORVZEL20 {
 
-/// What is known of the calls on a set of watched objects: each as one line, in order. Can make calls fail.
+/// Records the calls on a set of watched objects, one line each, in order. Can make calls fail.
 ///
-/// A line tells object, operation, arguments and context: `ns0:Disk.EnumerateInstances(false) {}`. Calls that the host itself makes
-/// on a watched object (a path asks its class for the name) are neither written down nor made to fail.
+/// A line has object, operation, arguments and context: `ns0:Disk.EnumerateInstances(false) {}`. Calls that the host itself makes
+/// on a watched object (a path asks its class for the name) are not recorded and never fail.
 class TCallWatch {
   public:
-    /// From now on the `number`-th call (from 1, calls already made not counted) fails with `status`; 0: none does.
+    /// Makes the `number`-th call fail with `status`, counted from 1 and from now. 0 makes none fail.
     void FailCall(std::size_t number, TZELStatusCode::EStatusCode status);
-    /// Each call whose line begins with `start` fails with `status`, until StopFailing.
+    /// Makes each call whose line begins with `start` fail with `status`, until StopFailing.
     void FailCallsOf(const std::string& start, TZELStatusCode::EStatusCode status);
     void StopFailing();
 
-    /// Whether FailCall's call has come.
+    /// Whether the call that FailCall ordered has failed.
     bool HasFailed() const { return fHasFailed; }
     std::size_t GetCount() const { return fLines.size(); }
     /// How many lines contain `text`.
     std::size_t CountOf(const std::string& text) const;
     /// The lines so far, each with a line end.
     std::string GetText() const;
-    /// GetText, and forgets the lines.
+    /// As GetText, and forgets the lines.
     std::string TakeText();
     void Forget() { fLines.clear(); }
 
-    /// Told by an operation of a watched object, before the call is passed on. `caller` is where that operation returns to.
+    /// Records a call. Watched objects call this before they forward one. `caller` is the return address of their operation.
     /// Errors: TZELException where this call is to fail.
     void Called(const std::string& line, const void* caller = __builtin_return_address(0));
 

@@ -7,7 +7,7 @@
 
 namespace NORVZEL20 {
 
-/// A class whose calls are watched, and those of all objects that it gives out.
+/// A class that records its calls and those of all objects that it returns.
 ///
 /// Labels: `ns0:Disk` for a class, `ns0:Disk.Id="sda"` for an instance that was enumerated, `ns0:new Disk` for one that was
 /// allocated.
@@ -15,7 +15,7 @@ class TWatchedClass : public ICIMClass {
   public:
     TWatchedClass(boost::shared_ptr<ICIMClass> cls, boost::shared_ptr<TCallWatch> watch, const std::string& namespaceLabel);
 
-    /// The class itself where it is not watched.
+    /// Returns the class inside, or `cls` itself if it is not watched.
     static boost::shared_ptr<ICIMClass> Unwatched(boost::shared_ptr<ICIMClass> cls);
     static boost::shared_ptr<const ICIMClass> Unwatched(boost::shared_ptr<const ICIMClass> cls);
     boost::shared_ptr<ICIMClass> GetWatched() const { return fClass; }

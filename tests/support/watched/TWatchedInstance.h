@@ -7,7 +7,7 @@
 
 namespace NORVZEL20 {
 
-/// An instance whose calls are watched. Its label is the one that its class gives it; see TWatchedClass.
+/// An instance that records its calls. Its class gives it its label; see TWatchedClass.
 class TWatchedInstance : public ICIMInstance {
   public:
     TWatchedInstance(boost::shared_ptr<ICIMInstance> instance, boost::shared_ptr<TCallWatch> watch, const std::string& label,

@@ -7,9 +7,9 @@
 
 namespace NORVZEL20 {
 
-/// A namespace whose calls are watched, and those of all classes, instances and properties that it gives out.
+/// A namespace that records its calls and those of all classes, instances and properties that it returns.
 ///
-/// Wrappers of the delta namespace (TDeltaClass) are given out as they are, because their users cast them down.
+/// Wrappers of the delta namespace (TDeltaClass) are returned as they are, because their users downcast them.
 class TWatchedNamespace : public ICIMNamespace {
   public:
     TWatchedNamespace(boost::shared_ptr<ICIMNamespace> ns, boost::shared_ptr<TCallWatch> watch, const std::string& label);

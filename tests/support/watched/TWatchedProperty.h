@@ -7,7 +7,7 @@
 
 namespace NORVZEL20 {
 
-/// A property whose calls are watched.
+/// A property that records its calls.
 class TWatchedProperty : public ICIMProperty {
   public:
     TWatchedProperty(boost::shared_ptr<ICIMProperty> property, boost::shared_ptr<TCallWatch> watch, const std::string& ownerLabel);

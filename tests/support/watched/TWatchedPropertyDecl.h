@@ -7,7 +7,7 @@
 
 namespace NORVZEL20 {
 
-/// A property declaration whose calls are watched.
+/// A property declaration that records its calls.
 class TWatchedPropertyDecl : public ICIMPropertyDecl {
   public:
     TWatchedPropertyDecl(boost::shared_ptr<const ICIMPropertyDecl> decl, boost::shared_ptr<TCallWatch> watch,
