@@ -13,11 +13,11 @@ namespace {
 const int kEnding[] = {SIGHUP, SIGINT, SIGQUIT, SIGTERM, SIGXCPU};
 
 // Set before the handler is installed, and never changed afterwards.
-void (*gCleanUp)() = nullptr;
+void (*gCleanUpOnSignal)() = nullptr;
 
 extern "C" void CleanUpAndEnd(int number)
 {
-    gCleanUp();
+    gCleanUpOnSignal();
     std::signal(number, SIG_DFL);
     raise(number);
 }
@@ -36,7 +36,7 @@ sigset_t EndingSignals() noexcept
 
 void CleanUpOnEndingSignals(void (*cleanUp)()) noexcept
 {
-    gCleanUp = cleanUp;
+    gCleanUpOnSignal = cleanUp;
     for (const int number : kEnding) {
         struct sigaction action = {};
         if (sigaction(number, nullptr, &action) != 0 || action.sa_handler == SIG_IGN) {

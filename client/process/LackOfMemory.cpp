@@ -22,7 +22,7 @@ const char* const kNoMemory = "cimdelta: not enough memory";
 
 namespace {
 
-void (*gCleanUp)() = nullptr;
+void (*gCleanUpWithoutMemory)() = nullptr;
 
 // Whether the exception that is being handled is std::bad_alloc.
 bool IsLackOfMemory() noexcept
@@ -41,7 +41,7 @@ bool IsLackOfMemory() noexcept
     if (std::current_exception() == nullptr || !IsLackOfMemory()) {
         std::abort();
     }
-    gCleanUp();
+    gCleanUpWithoutMemory();
     TryWriteWhole(STDERR_FILENO, kNoMemory);
     TryWriteWhole(STDERR_FILENO, "\n");
     _exit(kExitTrouble);
@@ -58,7 +58,7 @@ void ThrowIfOutOfMemory(const TZELException& error)
 
 void EndInOrderWithoutMemory(void (*cleanUp)()) noexcept
 {
-    gCleanUp = cleanUp;
+    gCleanUpWithoutMemory = cleanUp;
     std::set_terminate(&End);
 }
 
