@@ -11,7 +11,7 @@ namespace {
 
 using L = TLoading;
 
-struct TRow {
+struct TBadInputRow {
     const char* what;
     std::string document;
     int status;
@@ -26,7 +26,7 @@ std::string ClassWithCounter()
     return L::Class("A", kCounter);
 }
 
-const TRow kRows[] = {
+const TBadInputRow kRows[] = {
     {"empty", "", 9, "doc.xml:1:1: found an empty document, expected CIM-XML"},
     {"blank", "\n\n", 9, "doc.xml:3:1: found malformed XML: no element found"},
     {"no XML at all", "hello", 9, "doc.xml:1:1: found malformed XML: syntax error"},
@@ -86,7 +86,7 @@ const TRow kRows[] = {
 
 TEST(BadInputTest, EachGetsOneMessageAndLeavesNothing)
 {
-    for (const TRow& row : kRows) {
+    for (const TBadInputRow& row : kRows) {
         TLoading loading;
         const std::string before = loading.Write();
         EXPECT_EQ(row.message, loading.ErrorOf(row.document)) << row.what;

@@ -9,7 +9,7 @@ namespace {
 
 using L = TLoading;
 
-struct TRow {
+struct TDeclarationRow {
     const char* what;
     std::string document;
     std::string message;
@@ -53,7 +53,7 @@ std::string LongName(std::size_t length)
     return name;
 }
 
-const TRow kRefusedRows[] = {
+const TDeclarationRow kRefusedRows[] = {
     {"another type than above", L::Group(L::Class("A", Text("S")) + Below("<PROPERTY.ARRAY NAME=\"S\" TYPE=\"uint8\"/>")),
      "doc.xml:3:46: found property \"S\" of type uint8[] in class \"B\", but a superclass declares it as string"},
     {"a property twice", L::Group(L::Class("A", Text("S") + Text("s"))),
@@ -82,7 +82,7 @@ const TRow kRefusedRows[] = {
          "...\", which is not declared; add its <CLASS> to the document or load it before"},
 };
 
-const TRow kToleratedRows[] = {
+const TDeclarationRow kToleratedRows[] = {
     {"a qualifier declared again", L::Group(QualifierDecl("x") + QualifierDecl("x")),
      "3: qualifier \"Q\" is declared again; the first declaration stands (1)\n"},
     {"another flavor than above",
@@ -97,14 +97,14 @@ const TRow kToleratedRows[] = {
 
 TEST(DeclarationsTest, WhatContradictsItselfIsRefused)
 {
-    for (const TRow& row : kRefusedRows) {
+    for (const TDeclarationRow& row : kRefusedRows) {
         EXPECT_EQ(row.message, TLoading().ErrorOf(row.document)) << row.what;
     }
 }
 
 TEST(DeclarationsTest, WhatIsOddIsToleratedWithAWord)
 {
-    for (const TRow& row : kToleratedRows) {
+    for (const TDeclarationRow& row : kToleratedRows) {
         EXPECT_EQ(row.message, L::Tolerated(TLoading().Load(row.document))) << row.what;
     }
 }

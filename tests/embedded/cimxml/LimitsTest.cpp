@@ -72,7 +72,7 @@ std::string Path(std::size_t keys)
 }
 
 /// A number of something that loads, and one more of it, which does not.
-struct TRow {
+struct TLimitRow {
     const char* what;
     std::string most;
     std::string tooMany;
@@ -81,7 +81,7 @@ struct TRow {
 
 TEST(LimitsTest, AsManyLoadAndOneMoreIsRefused)
 {
-    const TRow rows[] = {
+    const TLimitRow rows[] = {
         {"properties of a class", Class("A", Properties(1024)), Class("A", Properties(1025)),
          "found more than 1024 properties in class \"A\"; split it"},
         {"with inherited ones", Class("A", Properties(24)) + Class("B", Properties(1000, 24), "A"),
@@ -108,7 +108,7 @@ TEST(LimitsTest, AsManyLoadAndOneMoreIsRefused)
          "found more than 1024 qualifiers on one element, inherited ones included; remove some"},
         {"key bindings of a path", Path(256), Path(257), "found more than 256 key bindings in one path"},
     };
-    for (const TRow& row : rows) {
+    for (const TLimitRow& row : rows) {
         EXPECT_EQ("", TLoading().ErrorOf(L::Group(row.most))) << row.what;
         TLoading loading;
         const std::string before = loading.Write();
