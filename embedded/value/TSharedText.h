@@ -4,6 +4,7 @@
 #include <string_view>
 
 #include "embedded/value/TCounted.h"
+#include "host/Export.h"
 
 namespace NORVZEL20 {
 
@@ -11,7 +12,7 @@ namespace NORVZEL20 {
 /// block for all the values that hold it.
 ///
 /// Threads: any, at any time.
-class TSharedText : public TCounted {
+class CIMDELTA_INTERNAL_EXPORT TSharedText : public TCounted {
   public:
     using TPointer = boost::intrusive_ptr<const TSharedText>;
 
