@@ -2,10 +2,12 @@
 
 #include <cstddef>
 
+#include "host/Export.h"
+
 namespace NORVZEL20 {
 
 /// The elements of CIM-XML (DSP0203) that a document to load may have.
-class TCimXmlElement {
+class CIMDELTA_INTERNAL_EXPORT TCimXmlElement {
   public:
     enum EElement : unsigned char {
         kUnknown = 0,
