@@ -4,7 +4,7 @@
 
 namespace NORVZEL20 {
 
-/// How the instances of one class are compared: which properties count, and which keys tell instances apart.
+/// How the instances of one class are compared: which properties are compared, and which keys identify an instance.
 class TCIMDiffEngine::TDiffClassRules {
   public:
     /// Rules that exclude everything.

@@ -40,7 +40,8 @@ void TCIMDiffEngine::TDiffXMLParser::TParseState::Push(TDiffXMLParser& parser, b
 void TCIMDiffEngine::TDiffXMLParser::TParseState::Unexpected(TDiffXMLParser& parser, const std::string& name)
 {
     parser.FatalError(("Unexpected element " + name).c_str());
-    throw TZELException(TZELStatusCode::kParseError);  // FatalError has thrown; the compiler cannot tell for a virtual call
+    throw TZELException(
+        TZELStatusCode::kParseError);  // FatalError always throws, but the compiler does not know it of a virtual call
 }
 
 void TCIMDiffEngine::TDiffXMLParser::TParseState::HandleAttrsOfTop(TDiffXMLParser& parser,

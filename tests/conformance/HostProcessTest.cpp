@@ -11,9 +11,9 @@
 #include "host/TRootObject.h"
 #include "host/TZELException.h"
 
-// What the load of the plug-in does to a process, and what the process's exit does to the plug-in: each load in a child of its own.
-// This program's version of an operation of the host stands in front of the library's, and so does its __cxa_atexit, with which
-// the compiler has what is static destroyed at the exit.
+// What the load of the plug-in does to a process, and what the process's exit does to the plug-in. Each load has its own child
+// process. This program defines an operation of the host and __cxa_atexit itself; its versions are found before the libraries'. The
+// compiler registers the destruction of static objects with __cxa_atexit.
 namespace {
 
 const std::size_t kMostObjects = 256;
@@ -44,7 +44,7 @@ namespace {
 
 using TProviderAction = std::function<TZELStatusCode(boost::shared_ptr<INamespaceProvider>)>;
 
-// Registers as the test wants.
+// Registers in the way that the test chooses.
 class TChosenManager : public INamespaceProviderManager {
   public:
     explicit TChosenManager(TProviderAction action) : fAction(action) {}
@@ -54,7 +54,7 @@ class TChosenManager : public INamespaceProviderManager {
     TProviderAction fAction;
 };
 
-// Never destroyed: the exit is what is looked at.
+// Never destroyed, because the tests observe the exit.
 boost::shared_ptr<INamespaceProviderManager>& Manager()
 {
     static auto& manager = *new boost::shared_ptr<INamespaceProviderManager>;
@@ -67,10 +67,10 @@ boost::weak_ptr<INamespaceProvider>& Provider()
     return provider;
 }
 
-// Loads the plug-in and ends the process; tells on standard error what has come out of the load, if anything has.
+// Loads the plug-in and ends the process. Writes any exception of the load to standard error.
 [[noreturn]] void LoadAndEnd()
 {
-    // Declared as throwing nothing, so that the compiler would end the process where something comes out of it.
+    // Declared noexcept: if an exception leaves it, the process ends.
     void* (*const volatile open)(const char*, int) = &dlopen;
     try {
         if (open(CIMDELTA_PLUGIN, RTLD_NOW | RTLD_GLOBAL) == nullptr) {

@@ -1,5 +1,4 @@
-// Has the compiler lay out every type whose bases and fields are given: their size must be known. Compiled for the dump alone,
-// never linked.
+// Makes the compiler lay out every type of layouts.txt by asking for its size. Compiled for the compiler's dump, never linked.
 #include "engine/TCompareInstances.h"
 #include "engine/TMasterInstance.h"
 #include "host/TAddKeyBindingsToMapCallback.h"

@@ -10,7 +10,7 @@ namespace {
 
 using TNames = std::vector<std::string>;
 
-/// The status that `call` fails with, 0 where it does not.
+/// The status that `call` throws, or kSuccess (0) if it throws nothing.
 template <class TCall>
 int StatusOf(const TCall& call)
 {

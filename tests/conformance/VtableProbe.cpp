@@ -1,5 +1,5 @@
-// Has the compiler lay out the virtual table of every type whose order of operations is part of the contract: a destructor sets
-// the table of its class. Compiled for the dump alone, never linked.
+// Makes the compiler lay out the virtual table of every type whose order of operations is part of the contract. A destructor sets
+// the table of its class, so each probe has one. Compiled for the compiler's dump, never linked.
 #include "embedded/store/TInMemNamedElement.h"
 #include "embedded/value/TStubClass.h"
 #include "host/ICIMClass.h"
@@ -24,7 +24,7 @@
 
 namespace NORVZEL20 {
 
-// The compiler names a table after its class alone, so that each probe needs a name of its own.
+// The dump names a table by its class alone, so each probe needs its own name.
 #define PROBE(name, type)                                                                                                          \
     struct TProbeOf##name : type {                                                                                                 \
         ~TProbeOf##name() override;                                                                                                \

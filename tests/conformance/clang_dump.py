@@ -1,4 +1,4 @@
-"""Compares what clang's own dumps tell of a probe with a text that hosts rely on. g++ has no such dumps."""
+"""Compares clang's dump of a probe with the text that hosts rely on. g++ has no such dumps."""
 
 import difflib
 import os

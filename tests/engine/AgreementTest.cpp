@@ -11,7 +11,7 @@
 namespace NORVZEL20 {
 namespace {
 
-// How many sets, and which is the first: CIMDELTA_SETS and CIMDELTA_SEED, so that a failure can be run again alone.
+// The number of sets and the first seed. CIMDELTA_SETS and CIMDELTA_SEED change them, to repeat a single failure.
 std::uint64_t FromEnvironment(const char* name, std::uint64_t otherwise)
 {
     const char* text = std::getenv(name);
@@ -20,7 +20,7 @@ std::uint64_t FromEnvironment(const char* name, std::uint64_t otherwise)
 
 class AgreementTest : public testing::TestWithParam<EHost> {
   protected:
-    // What the outcomes of all sets contained.
+    // The kinds of results that all sets together had.
     std::map<std::string, unsigned int> fSeen;
 
     void Note(const std::string& outcome)

@@ -19,7 +19,7 @@ class ConstructionTest : public testing::TestWithParam<EHost> {
   protected:
     ConstructionTest() : fComparison(GetParam()) { fComparison.Rules("<DifftoolSpec/>"); }
 
-    // Makes an engine over all namespaces: "" or a status.
+    // Makes an engine over all namespaces. Returns "" or the status that this throws.
     std::string Construct(const std::string& suffix = "")
     {
         fNamespaces = fComparison.AllWatched();
@@ -187,7 +187,7 @@ TEST_P(ConstructionTest, ErrorsOfTheSpecificationKeepTheirStatus)
     EXPECT_EQ("status 9", Construct());
 }
 
-// An instance whose properties have a greater number each time they are asked for.
+// An instance whose properties have a greater number at each call.
 class TDriftingInstance : public TWatchedInstance {
   public:
     TDriftingInstance(boost::shared_ptr<ICIMInstance> instance, unsigned short* number)

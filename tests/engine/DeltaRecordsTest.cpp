@@ -150,7 +150,7 @@ TEST_P(DeltaRecordsTest, AFailureBeforeTheRecordLeavesNothing)
     EXPECT_EQ("Disk\n", fComparison.Records());
 }
 
-// A delta namespace that answers for each class with the same one, or with null.
+// A delta namespace that returns the same class, or null, for every name.
 class TBareNamespace : public TWatchedNamespace {
   public:
     explicit TBareNamespace(boost::shared_ptr<ICIMClass> cls)

@@ -33,13 +33,14 @@ const char* const kAllRecords = "Disk\n"
                                 "  2 Disk.Id=\"new\" [1]\n"
                                 "  4 Disk.Id=\"changed\" Size [1]\n";
 
-/// Records of which the last may be one that nothing ties to its class yet.
+/// The records. The last one may lack its association with the class.
 struct TLeft {
     std::string tied;
     std::string loose;
 };
 
-/// What stands in the store when that many instances have been added: the class's record, then each record followed by its tie.
+/// The contents of the store after that many instances were added: the class's record, then each record followed by its
+/// association.
 TLeft LeftAfter(std::size_t added)
 {
     std::istringstream all(kAllRecords);
@@ -55,7 +56,7 @@ TLeft LeftAfter(std::size_t added)
     return left;
 }
 
-/// How many instances an untouched run has added to the store before each of its calls.
+/// For each call of a run without faults, the number of instances that it has added to the store before.
 std::vector<std::size_t> CountAddedBeforeCalls()
 {
     TFaultyRun run;

@@ -48,7 +48,7 @@ class InstanceComparisonTest : public TEngineFixture {
         return Text(fDifferences);
     }
 
-    // The outcome for one property with these values on the two sides.
+    // The result for one property with these values in the two instances.
     std::string Compare(const std::string& name, const TCIMValue& master, const TCIMValue& other)
     {
         fDifferences.clear();
@@ -206,7 +206,7 @@ TEST_F(ThreeNamespacesTest, IndicesAreAppendedForEachInstance)
 
 class CompareInstancesTest : public ThreeNamespacesTest {
   protected:
-    // What comes of one more instance of the namespace at that position.
+    // The result of one more instance in the namespace at that position.
     std::string Take(std::size_t index, const TNamespaceBuilder::TValues& values)
     {
         TEngine::TCompareInstances take(&Engine(), fRules, &fMasters, &fMissing, &fDifferences, static_cast<unsigned int>(index),

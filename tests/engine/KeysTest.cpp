@@ -105,7 +105,7 @@ TEST_P(KeysTest, AKeyPropertyThatIsNullFailsTheAssertion)
 
 using TNames = std::list<std::string>;
 
-// A class whose key names are good for as long as it lives.
+// A class whose key names become invalid when it is destroyed.
 class TPassingClass : public TWatchedClass {
   public:
     TPassingClass(boost::shared_ptr<ICIMClass> cls, boost::shared_ptr<TNames> names)
@@ -123,7 +123,7 @@ class TPassingClass : public TWatchedClass {
     boost::shared_ptr<TNames> fNames;
 };
 
-// An instance that makes a class for each one who asks, and keeps none.
+// An instance that makes a new class for each call and keeps none.
 class TInstanceOfPassingClass : public TWatchedInstance {
   public:
     explicit TInstanceOfPassingClass(boost::shared_ptr<ICIMInstance> instance)
@@ -137,7 +137,7 @@ class TInstanceOfPassingClass : public TWatchedInstance {
     }
 
   private:
-    mutable std::vector<boost::shared_ptr<TNames>> fNames;  // kept, so that a name read too late is seen to be gone
+    mutable std::vector<boost::shared_ptr<TNames>> fNames;  // kept, so a name that is read too late shows as changed
 };
 
 TEST_P(KeysTest, TheClassIsHeldUntilItsKeyNamesAreRead)

@@ -3,7 +3,7 @@
 namespace NORVZEL20 {
 namespace {
 
-// Rules hold byte for byte, over a host that finds its names in any letter case.
+// Names in rules are compared byte for byte, also if the host finds its names in any letter case.
 class LetterCaseTest : public TPerClassFixture {
   protected:
     LetterCaseTest() : TPerClassFixture(EHost::kInmem)

@@ -6,8 +6,9 @@
 
 namespace NORVZEL20 {
 
-/// What a difference run over the set leaves behind, found by looking at every pair of instances: the records (as DumpRecords
-/// tells them), the aliases (as DumpAliases does), `status 37` where the run fails, and the instances of the first namespace.
+/// The expected result of a difference run over the set, found by comparing every pair of instances: the records in the form of
+/// DumpRecords, the aliases in the form of DumpAliases, `status 37` if the run fails with kSchemaMismatch (37), and the instances
+/// of the first namespace.
 std::string CompareNaively(TNaiveSet set);
 
 }  // namespace NORVZEL20

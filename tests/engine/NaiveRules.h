@@ -8,7 +8,7 @@
 
 namespace NORVZEL20 {
 
-/// What the rules come to for one class.
+/// The rules that apply to one class.
 struct TNaiveRules {
     bool isIncluded = false;
     std::map<std::string, bool> listed;
@@ -18,7 +18,7 @@ struct TNaiveRules {
     bool IsExcludedKey(const std::string& name) const;
 };
 
-/// What the comparison of a set ends with, where it fails.
+/// Thrown if the comparison of a set fails.
 struct TNaiveFailure {
     int status;
 };
@@ -28,7 +28,7 @@ const TNaiveClass* FindNaiveClass(const TNaiveNamespace& ns, const std::string& 
 /// All properties of a class, inherited ones first.
 std::vector<TNaiveProperty> AllNaiveProperties(const TNaiveNamespace& ns, const std::string& className);
 
-/// The rules of each class, from the elements read one after the other. Throws TNaiveFailure 9 for an unknown name.
+/// The rules of each class, after all elements were read in order. Errors: TNaiveFailure with kParseError (9) for an unknown name.
 std::map<std::string, TNaiveRules> NaiveRulesOf(const TNaiveSet& set);
 
 }  // namespace NORVZEL20

@@ -9,12 +9,12 @@
 
 namespace NORVZEL20 {
 
-// How plain data is written, as the plug-in's host and the dumps write it.
+// The texts of plain data, in the form of the host and of the dumps.
 
-/// A path's text from its parts; the keys' values are written already. An empty `ns` is left out.
+/// The text of a path. `keys` holds texts of values. An empty `ns` is left out.
 std::string NaivePathText(const std::string& ns, const std::string& className,
                           const std::vector<std::pair<std::string, std::string>>& keys);
-/// The text of a path that is a value, as the rules let it count.
+/// The text by which a path that is a value is compared under the rules.
 std::string NaivePathOf(const TNaiveValue& value, const TNaiveRules& rules);
 /// A key's value within a path.
 std::string NaiveKeyText(const TNaiveValue& value);

@@ -10,7 +10,7 @@
 namespace NORVZEL20 {
 namespace {
 
-// A class whose instances are there for the first one who asks.
+// A class that enumerates its instances once, and nothing afterwards.
 class TVanishingClass : public TWatchedClass {
   public:
     explicit TVanishingClass(boost::shared_ptr<ICIMClass> cls) : TWatchedClass(cls, boost::make_shared<TCallWatch>(), "vanishing")
@@ -56,15 +56,14 @@ class TClassOfSizelessInstances : public TWatchedClass {
     }
 };
 
-// What the host hands out empty is used all the same, and ends the run at the host's assertion.
+// The engine does not check for null: a null pointer from the host ends the run at the host's assertion.
 class NullHandlesTest : public TPerClassFixture, public testing::WithParamInterface<EHost> {
   protected:
     using TMakeClass = std::function<boost::shared_ptr<ICIMClass>(boost::shared_ptr<ICIMClass>)>;
 
     NullHandlesTest() : TPerClassFixture(GetParam()) { Namespace(0); }
 
-    // The records of a run, by which the assertion has failed, with one more namespace: its Disk has one instance, "sda", and is
-    // what a test makes of it.
+    // The records of a run that failed the assertion. The test supplies the last namespace, whose Disk has one instance, "sda".
     std::string RecordsOfRunAgainst(TMakeClass makeDisk)
     {
         fComparison.Prepare();

@@ -203,7 +203,7 @@ TEST_P(ExcludedKeysTest, ARunWritesNothingToStandardOutput)
     EXPECT_EQ("status 9\n", status);
 }
 
-// What a store with checks refuses: instances with the same keys.
+// Instances with the same keys, which a store that checks keys refuses.
 class SameKeysTest : public TPerClassFixture {
   protected:
     SameKeysTest() : TPerClassFixture(EHost::kPlain) {}

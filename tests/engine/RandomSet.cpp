@@ -11,7 +11,7 @@ namespace {
 
 using EKind = TNaiveValue::EKind;
 
-// Makes one set; the same draws everywhere, whatever the library's distributions do.
+// Makes one set. It uses no distributions of the library, whose results differ between libraries.
 class TGenerator {
   public:
     TGenerator(const std::function<std::uint64_t()>& source, bool isStrict) : fSource(source), fIsStrict(isStrict) {}
@@ -102,7 +102,7 @@ TNaiveNamespace TGenerator::MakeNamespace(const TNaiveNamespace* reference)
     return ns;
 }
 
-// Leaves out a class without subclasses, or one property that is no key; now and then the operating system.
+// Leaves out a class without subclasses, or a property that is no key; sometimes the operating system.
 void TGenerator::DropSome(TNaiveNamespace& ns)
 {
     if (OneIn(8)) {

@@ -7,10 +7,10 @@
 
 namespace NORVZEL20 {
 
-/// A small set of namespaces and rules, the same one for the same seed.
+/// A small set of namespaces and rules. The same seed gives the same set.
 ///
-/// One to five namespaces, a tree of up to five classes of which some lack a class or a property, few values, so that instances
-/// meet; with `isStrict` no two instances of a namespace have the same keys and no key is null.
+/// One to five namespaces with a tree of up to five classes; some namespaces lack a class or a property. Values are few, so keys of
+/// instances often agree. With `isStrict`, no two instances of a namespace have the same keys, and no key is null.
 TNaiveSet MakeRandomSet(std::uint64_t seed, bool isStrict);
 
 /// The same with the draws of a source.

@@ -4,7 +4,7 @@
 namespace NORVZEL20 {
 namespace {
 
-// What a whole run asks of the host: every call, in order, with its context.
+// All calls of a whole run on the host, in order, with their contexts.
 class RunCallsTest : public testing::TestWithParam<EHost> {
   protected:
     RunCallsTest() : fComparison(GetParam()) {}
@@ -55,7 +55,7 @@ std::string Calls(const std::string& object, const std::vector<std::string>& cal
     return text;
 }
 
-// The check of the operating systems: the first instance of the reference, again for each namespace.
+// The check of the operating systems. It reads the first instance of the reference again for each namespace.
 std::string SystemCheck(const std::vector<std::string>& namespaces)
 {
     std::string text;
@@ -72,7 +72,7 @@ const char* const kRulesRead = "ns0.GetClass(\"Disk\") {}\n"
                                "ns0.GetClass(\"Disk\") {}\n"
                                "ns0:Disk.EnumerateSubClasses(false) {}\n";
 
-// The walk up to Disk; nothing is compared of the operating system.
+// The walk up to Disk. The rules compare nothing of the operating system.
 const char* const kWalk = "ns0.GetClass(\"<root>\") {}\n"
                           "ns0:<root>.EnumerateSubClasses(false) {}\n"
                           "ns0:KALMO_OperatingSystem.GetName() {}\n"
@@ -129,14 +129,14 @@ std::string Record(int type, const std::string& instance, const std::string& pro
                        "Delta.SetValue(root/cimv2:KALMO_Delta.DeltaID=" + std::to_string(number) + ") {}", "AddToNamespace() {}"});
 }
 
-// What follows the record of an instance that the other one of two namespaces lacks.
+// The calls after the record of an instance that only the reference has, with two namespaces.
 std::string Marked(const std::string& id)
 {
     return Calls("ns0:Disk.Id=\"" + id + "\"",
                  {"EnumerateProperties() {}", "Id.GetValue() {}", "Id.MarkRemoved()", "Size.GetValue() {}", "Size.MarkRemoved()"});
 }
 
-// What follows the record of an instance that only the other one of two namespaces has.
+// The calls after the record of an instance that only the other namespace has, with two namespaces.
 std::string Copied(const std::string& id, unsigned int size)
 {
     const std::string disk = "ns1:Disk.Id=\"" + id + "\"";
@@ -168,7 +168,7 @@ TEST_P(RunCallsTest, OfTwoNamespaces)
               CallsOfRun());
 }
 
-// The calls after the class record is there.
+// The calls after the class record has been added.
 std::string OfTheRecords(const std::string& calls)
 {
     const std::size_t start = calls.find(kClassRecord);
@@ -190,7 +190,7 @@ TEST_P(RunCallsTest, OfTwoNamespacesAnInstanceAtATime)
               OfTheRecords(CallsOfRun()));
 }
 
-// An absent instance where keys are excluded.
+// An absent instance if keys are excluded.
 std::string RecordWithAlias(const std::string& id, int number)
 {
     const std::string path = "root/cimv2:Disk.Id=\"" + id + "\"";
@@ -244,7 +244,7 @@ std::string Alias(const std::string& ns, const std::string& id, bool isWrapperTh
            (isWrapperThere ? "" : ns + ".GetClass(\"Disk\") {nsIndex=" + index + "}\n");
 }
 
-// The key of a disk where its one key is excluded.
+// The key of a disk whose only key is excluded.
 std::string EmptyKey(const std::string& ns, const std::string& id)
 {
     const std::string disk = ns + ":Disk.Id=\"" + id + "\"";

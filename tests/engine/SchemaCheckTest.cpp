@@ -14,7 +14,7 @@ std::string NotFound(const std::string& className, std::size_t index)
            ")\n|";
 }
 
-// Card > Modem, declared where a test says; Disk everywhere.
+// Each test declares Card > Modem in the namespaces that it needs. All namespaces have Disk.
 class SchemaCheckTest : public TPerClassFixture, public testing::WithParamInterface<EHost> {
   protected:
     SchemaCheckTest() : TPerClassFixture(GetParam())
@@ -89,7 +89,7 @@ struct TSpecialException : TZELException {
     using TZELException::TZELException;
 };
 
-// A namespace that fails in its own way when it is asked for a Card.
+// A namespace that throws what the test chooses if it is asked for Card.
 class TCardlessNamespace : public TWatchedNamespace {
   public:
     explicit TCardlessNamespace(boost::shared_ptr<ICIMNamespace> ns)

@@ -10,7 +10,7 @@ namespace NORVZEL20 {
 /// The specification of a set, as a document.
 std::string RulesOf(const TNaiveSet& set);
 
-/// Builds the set in namespaces of that host, runs the plug-in over it, and tells what it leaves behind as CompareNaively does.
+/// Builds the set in namespaces of that host and runs the plug-in over it. Returns the result in the form of CompareNaively.
 std::string CompareByPlugIn(const TNaiveSet& set, EHost host);
 
 }  // namespace NORVZEL20

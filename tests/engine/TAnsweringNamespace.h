@@ -9,7 +9,7 @@
 
 namespace NORVZEL20 {
 
-/// A namespace that answers for its classes as a test says.
+/// A namespace whose answers to GetClass a test chooses.
 class TAnsweringNamespace : public TWatchedNamespace {
   public:
     using TAnswer = std::function<boost::shared_ptr<ICIMClass>(const std::string&)>;

@@ -16,7 +16,7 @@ namespace NORVZEL20 {
 
 using TEngine = TCIMDiffEngine;
 
-/// An engine over watched namespaces, made without a specification, to call its operations one by one.
+/// An engine over watched namespaces, without a specification. Tests call its operations one by one.
 ///
 /// Each namespace holds Disk: keys Bus (uint32) and Id; Size (uint32), Owner (reference), Tags (array), DateTimeOfCollection.
 class TEngineFixture : public testing::Test {
@@ -41,7 +41,7 @@ class TEngineFixture : public testing::Test {
     std::unique_ptr<TEngine> fEngine;
 };
 
-/// `status 37` for the exception that the call ends with, else "".
+/// The status of the TZELException that the call throws, such as `status 37`; empty if it throws nothing.
 std::string OutcomeOf(const std::function<void()>& call);
 
 }  // namespace NORVZEL20

@@ -10,9 +10,9 @@
 
 namespace NORVZEL20 {
 
-/// The naive comparison of one set, class by class: every pair of instances is looked at.
+/// The naive comparison of one set, class by class. It compares every pair of instances.
 ///
-/// Call Go once. Errors: TNaiveFailure; what was written until then stays.
+/// Call Go once. Errors: TNaiveFailure; what was written before stays.
 class TNaiveRun {
   public:
     explicit TNaiveRun(TNaiveSet& set) : fSet(set) {}

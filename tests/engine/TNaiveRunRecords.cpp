@@ -3,7 +3,7 @@
 #include "tests/engine/NaiveText.h"
 #include "tests/engine/TNaiveRun.h"
 
-// What a run leaves: records, copies, aliases.
+// The results of a run: records, copies and aliases.
 
 namespace NORVZEL20 {
 

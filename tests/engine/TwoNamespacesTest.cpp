@@ -5,7 +5,7 @@
 namespace NORVZEL20 {
 namespace {
 
-// With exactly two namespaces the reference is brought in line with the other one.
+// With exactly two namespaces, the reference takes over the values and instances of the other one.
 class TwoNamespacesTest : public TPerClassFixture, public testing::WithParamInterface<EHost> {
   protected:
     TwoNamespacesTest() : TPerClassFixture(GetParam()) {}

@@ -3,12 +3,12 @@
 namespace NORVZEL20 {
 namespace {
 
-// How much the engine asks of the host, by counting.
+// Counts the calls of the engine on the host.
 class WorkTest : public TPerClassFixture {
   protected:
     WorkTest() : TPerClassFixture(EHost::kPlain) {}
 
-    // Fills that many disks into each of some namespaces, the others' sizes differing by `change`, and runs.
+    // Adds that many disks to each namespace and runs. The sizes in the other namespaces differ by `change`.
     TCallWatch& Run(std::size_t namespaces, unsigned int disks, unsigned int change)
     {
         for (std::size_t index = 0; index < namespaces; ++index) {

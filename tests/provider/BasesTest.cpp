@@ -23,8 +23,8 @@ std::string NameOf(const std::type_info& type)
     return name.get();
 }
 
-// The bases in the order of declaration, as the compiler tells them to dynamic_cast. A layout does not tell that order: a base
-// with virtual operations comes first in any case.
+// The bases in the order of declaration, read from the type information. The layout does not show that order, because a base with
+// virtual operations always comes first.
 std::string BasesOf(const std::type_info& type)
 {
     std::string text;

@@ -12,7 +12,7 @@ namespace {
 
 const TCallContext kNone;
 
-// A wrapper of a class that answers as the test wants, and one element of each kind to give it.
+// A wrapper of a class whose answers the test chooses, and one element of each kind to pass to it.
 class DeltaClassAnswersTest : public TDeltaFixture {
   protected:
     DeltaClassAnswersTest()
@@ -27,7 +27,7 @@ class DeltaClassAnswersTest : public TDeltaFixture {
         fClass->SetMethodDecl(fMethodDecl);
     }
 
-    // What the wrapped class was asked, whether it got this very object, and what came back.
+    // The operation that was called on the wrapped class, whether it got this object, and its result.
     template <class T>
     std::string Give(bool (ICIMClass::*operation)(boost::shared_ptr<T>), boost::shared_ptr<T> element)
     {
@@ -46,7 +46,7 @@ class DeltaClassAnswersTest : public TDeltaFixture {
                Give(&ICIMClass::AddMethodDecl, fMethodDecl) + Give(&ICIMClass::RemoveMethodDecl, fMethodDecl);
     }
 
-    // The questions that the wrapper answers with yes.
+    // The operations to which the wrapper returns true.
     std::string Affirmed()
     {
         const auto other = boost::make_shared<TDeltaClass>(fComparison.GetDelta(), fElement);
@@ -55,7 +55,7 @@ class DeltaClassAnswersTest : public TDeltaFixture {
                (fWrapper.IsSubclassOf(other, At(1)) ? "IsSubclassOf " : "");
     }
 
-    // The enumeration that the wrapped class was asked for, and whether with the caller's own callback.
+    // The enumeration that was called on the wrapped class, and whether it got the caller's own callback.
     template <class TCallback, class TEnumerate>
     std::string Enumerate(const TCallback& callback, const TEnumerate& enumerate)
     {

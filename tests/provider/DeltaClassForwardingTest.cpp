@@ -10,12 +10,12 @@ namespace {
 
 const TCallContext kNone;
 
-// Questions to the wrapper of Base in the compared namespace 1; the wrapped class writes down what reaches it.
+// Calls the wrapper of Base in the compared namespace 1. The wrapped class records the calls that reach it.
 class DeltaClassForwardingTest : public TDeltaFixture {
   protected:
     DeltaClassForwardingTest() : fBase(Delta().GetClass("Base", At(1))) { Watch().Forget(); }
 
-    // The one call that reached the wrapped class, without its name.
+    // The only call that reached the wrapped class, without the name of the class.
     std::string Call()
     {
         const std::string text = Watch().TakeText();

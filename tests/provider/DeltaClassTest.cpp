@@ -31,7 +31,7 @@ class DeltaClassTest : public TDeltaFixture {
         return wrapper;
     }
 
-    // Collects what an enumeration hands out.
+    // Collects the classes of an enumeration.
     TClassCallback Collect(bool answer = true)
     {
         return [this, answer](boost::shared_ptr<ICIMClass> cls) { return fClasses.push_back(cls), answer; };

@@ -10,7 +10,7 @@ namespace {
 
 class DiffIndexTest : public TDeltaFixture {
   protected:
-    // What the call gives or throws, and what it writes to standard output and to the log.
+    // The result or status of the call, and its text on standard output and in the log.
     std::string Ask(const TCallContext& context)
     {
         std::string answer;
@@ -41,7 +41,7 @@ TEST_F(DiffIndexTest, APositionBehindTheLastIsPrintedAndRefused)
     EXPECT_EQ("status 15|Bad nsIndex, nsIndex=65535\n", Ask(At(65535)));
 }
 
-// How standard output writes numbers, put back at the end.
+// Changes how standard output writes numbers, and restores it at the end.
 class TOddOutput {
   public:
     TOddOutput() : fFormat(nullptr), fLocale(std::cout.imbue(std::locale(std::locale::classic(), new TGrouping)))
@@ -58,7 +58,7 @@ class TOddOutput {
     }
 
   private:
-    // Thousands apart, as some locales write them.
+    // Separates thousands, like some locales.
     struct TGrouping : std::numpunct<char> {
         char do_thousands_sep() const override { return ','; }
         std::string do_grouping() const override { return "\3"; }

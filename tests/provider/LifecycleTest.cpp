@@ -120,7 +120,7 @@ TEST(LifecycleTest, DestructionReleasesStoreAndComparedNamespaces)
     EXPECT_TRUE(weakCompared.expired());
 }
 
-// A namespace that notes its end.
+// A namespace that records its destruction.
 class TMortalNamespace : public TWatchedNamespace {
   public:
     TMortalNamespace(const std::string& name, std::string& ends)
@@ -133,7 +133,7 @@ class TMortalNamespace : public TWatchedNamespace {
     std::string& fEnds;
 };
 
-// A class that notes its end.
+// A class that records its destruction.
 class TMortalClass : public TPlainClass {
   public:
     TMortalClass(const std::string& name, std::string& ends) : TPlainClass(name, nullptr, nullptr), fEnds(ends) {}
@@ -149,7 +149,7 @@ TEST(LifecycleTest, TheStoreIsReleasedFirstThenTheComparedNamespacesThenTheWrapp
     auto delta = WithoutStore();
     delta->AddNamespaceToCompareList(boost::make_shared<TMortalNamespace>("compared", ends));
     TTestAccess::SetStore(*delta, boost::make_shared<TMortalNamespace>("store", ends));
-    // One that does not hold the namespace, as its own wrappers do.
+    // A wrapper that does not hold the namespace, unlike those that the namespace makes.
     TTestAccess::PutWrapper(*delta, 0, "Disk",
                             boost::make_shared<TDeltaClass>(nullptr, boost::make_shared<TMortalClass>("Disk", ends)));
     delta.reset();

@@ -110,7 +110,7 @@ TEST_F(NamespaceAccessTest, AnIndexOutOfRangeIsPrintedAndRefused)
     EXPECT_EQ("Bad nsIndex, nsIndex=3\n", testing::internal::GetCapturedStdout());
 }
 
-// Stands in for a namespace that fails, or answers, in its own way.
+// A namespace whose failures and answers the test chooses.
 class TOddNamespace : public TWatchedNamespace {
   public:
     TOddNamespace(boost::shared_ptr<ICIMNamespace> ns, std::function<boost::shared_ptr<ICIMClass>()> answer)

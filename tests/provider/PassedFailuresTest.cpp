@@ -12,7 +12,7 @@ namespace {
 
 const TCallContext kNone;
 
-// A host's own failures: one that carries a status, and one that knows nothing of statuses.
+// Exceptions of a host's own: one with a status, and one without.
 struct TOwnStatus : TZELException {
     using TZELException::TZELException;
 };
@@ -49,7 +49,7 @@ class TFailingNamespace : public TWatchedNamespace {
     std::function<void()> fFail;
 };
 
-// What the call throws, and with which words.
+// The exception that the call throws, and its text.
 std::string Thrown(const std::function<void()>& call)
 {
     try {
@@ -64,7 +64,7 @@ std::string Thrown(const std::function<void()>& call)
     return "nothing";
 }
 
-// The delta namespace of the fixture, and one more to compare; that one or the store fails.
+// The delta namespace of the fixture with one more compared namespace. Either that one or the store fails.
 class PassedFailuresTest : public TDeltaFixture {
   protected:
     PassedFailuresTest()
@@ -136,7 +136,7 @@ TEST_F(PassedFailuresTest, WithoutAnOwnerTheComparedNamespaceIsAskedBeforeTheWra
     EXPECT_TRUE(TTestAccess::ClassCache(onStack)[0].empty());
 }
 
-// What is called while the last owner lets go finds a reference to itself that has expired.
+// Calls from the last owner's deleter: the namespace's weak pointer to itself has expired.
 TEST_F(PassedFailuresTest, WithoutAnOwnerAnyMoreNothingRunsOrIsWrapped)
 {
     const auto store = TTestAccess::Store(Delta());

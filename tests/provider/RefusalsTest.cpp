@@ -11,7 +11,7 @@ using TInstanceCallback = boost::function<bool(boost::shared_ptr<ICIMInstance>)>
 
 class RefusalsTest : public TDeltaFixture {
   protected:
-    // Refused operations look at no argument, change nothing and ask nobody.
+    // Refused operations read no argument, change nothing and call nothing.
     void ExpectRefused(int status, const std::function<void()>& call)
     {
         EXPECT_EQ(status, StatusOf(call));

@@ -14,8 +14,9 @@
 #include "tests/support/TTestAccess.h"
 #include "tests/support/plain/TPlainNamespace.h"
 
-// This program's own versions of some operations of the host stand in front of the library's, so that tests see each call and
-// have it answer what they want. The library asks for the manager before this program's objects are made: flags and pointers only.
+// This program defines some operations of the host itself. Its versions are found before the library's, so tests see each call and
+// choose the answer. The plug-in calls them while it is loaded, before this program's objects are made. They use only flags and
+// pointers.
 namespace NORVZEL20 {
 namespace {
 
@@ -33,7 +34,7 @@ TOperation Original(const char* symbol)
     return reinterpret_cast<TOperation>(dlsym(RTLD_NEXT, symbol));
 }
 
-// An explicit instantiation may name private members: so a test can have the one registry of the process hold what it wants.
+// The arguments of an explicit instantiation may name private members. A test sets the process's only registry in this way.
 using TProviders = std::vector<boost::shared_ptr<INamespaceProvider>>;
 TProviders& ProvidersOf(TNamespaceProviderManager& manager);
 
@@ -43,7 +44,7 @@ struct TRegistryAccess {
 };
 template struct TRegistryAccess<&TNamespaceProviderManager::fProviders>;
 
-// Answers as "inmem" does, and tells what it was asked.
+// Answers like the provider "inmem" and records the calls.
 class TTellingProvider : public INamespaceProvider {
   public:
     const std::string& GetName(TCallContext) const override { return fName; }

@@ -64,7 +64,7 @@ TEST_F(StoreAccessTest, QueriesGoToTheStoreAsTheyAre)
     EXPECT_EQ("store.ExecuteQuery(\"a language\", \"select * from nothing\") {nsIndex=1}\n", Watch().TakeText());
 }
 
-// Notes the objects that a query comes with.
+// Records the arguments of a query.
 class TQueriedNamespace : public TWatchedNamespace {
   public:
     TQueriedNamespace() : TWatchedNamespace(MakeNamespace(EHost::kPlain, "queried"), boost::make_shared<TCallWatch>(), "queried") {}

@@ -6,20 +6,20 @@
 
 namespace NORVZEL20 {
 
-/// A class whose answers a test chooses, and which tells what it was given.
+/// A class whose answers a test chooses. It records the last call and its argument.
 class TAnsweringClass : public TPlainClass {
   public:
     using TPlainClass::TPlainClass;
 
-    /// The one operation that answers true.
+    /// The only operation that returns true.
     void SetTrue(const std::string& operation) { fTrue = operation; }
-    /// What is given out and enumerated.
+    /// The objects that it returns and enumerates.
     void SetProperty(boost::shared_ptr<ICIMProperty> property) { fProperty = property; }
     void SetMethodDecl(boost::shared_ptr<ICIMMethodDecl> decl) { fMethodDecl = decl; }
 
     /// The operation that was called last.
     const std::string& GetOperation() const { return fOperation; }
-    /// The object that it was given.
+    /// The argument of that call.
     const void* GetArgument() const { return fArgument; }
 
     bool IsAssociation(TCallContext) const override { return Answer("IsAssociation", nullptr); }

@@ -10,16 +10,16 @@
 
 namespace NORVZEL20 {
 
-/// A delta namespace over three compared ones of the plain host, everything watched. Each holds Base (key Id) > Sub.
+/// A delta namespace over three compared namespaces of the plain host, all watched. Each namespace has Base (key Id) > Sub.
 ///
-/// Nothing but a run writes to the core log, whatever the status it fails with: each test ends with a look at it.
+/// Only a run writes to the core log, so each test ends with a check that the log is empty.
 class TDeltaFixture : public testing::Test {
   protected:
     TDeltaFixture();
 
     void TearDown() override { EXPECT_EQ("", fLog.Take()); }
 
-    /// A call context with that "nsIndex".
+    /// A call context with this value of "nsIndex".
     static TCallContext At(unsigned short index);
 
     TCallWatch& Watch() { return fComparison.GetWatch(); }
@@ -29,7 +29,7 @@ class TDeltaFixture : public testing::Test {
     TComparisonRun fComparison;
 };
 
-/// The status that the call throws, or 0 where it throws nothing.
+/// The status that the call throws, or kSuccess (0) if it throws nothing.
 int StatusOf(const std::function<void()>& call);
 /// Whether the call fails the host's assertion "px != 0".
 bool FailsOnNull(const std::function<void()>& call);

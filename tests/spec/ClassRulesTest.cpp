@@ -68,7 +68,7 @@ TEST(ExcludedKeysTest, AnyWhiteSpaceSeparatesNames)
     EXPECT_TRUE(rules.hasExcludedKeys());
 }
 
-/// The words of a text as a formatted read tells them.
+/// The words of a text, split by formatted reads.
 std::vector<std::string> WordsOf(const std::string& text)
 {
     std::istringstream in(text);

@@ -25,7 +25,7 @@ boost::shared_ptr<TRules> Rules(TCIMDiffEngine::propType def, const TProperties&
     return rules;
 }
 
-// A class tree: Base > Mid > Leaf, and Base > Side; Other stands alone.
+// The class tree: Base > Mid > Leaf, and Base > Side. Other has no relatives.
 class RulesetTest : public testing::Test {
   protected:
     RulesetTest() : fWatch(boost::make_shared<TCallWatch>()), fBuilder(MakeNamespace(EHost::kPlain, "root/cimv2"))

@@ -13,7 +13,7 @@ namespace {
 
 enum class EEvent { kStart, kEnd };
 
-// A document with one error; each tag stands on a line of its own, so that the line tells the tag.
+// A document with one error. Each tag has its own line, so the line of the message shows which tag is meant.
 struct TBadSpec {
     std::string document;
     unsigned int line;
@@ -109,7 +109,7 @@ const std::vector<TBadSpec> kBadLists = {
     {InValue("Z<x/>"), 4, "Invalid property \"Z\" specified on line #\n", EEvent::kEnd},
 };
 
-// Names in another letter case than the schema's; whether it knows them is the host's business.
+// Names in another letter case than the schema's. The host decides whether it finds them.
 const std::vector<TBadSpec> kOtherCase = {
     {"<DifftoolSpec>\n<class name=\"other\"/>\n</DifftoolSpec>", 2, kNoClass},
     {"<DifftoolSpec>\n<class name=\"OTHER\"/>\n</DifftoolSpec>", 2, kNoClass},
@@ -221,7 +221,7 @@ struct TSpecialException : TZELException {
     using TZELException::TZELException;
 };
 
-// A schema that answers a number of times, and then throws in its own way.
+// A schema that answers a number of calls and then throws.
 template <typename TFailure>
 class TFadingSchema : public TWatchedNamespace {
   public:
@@ -244,7 +244,7 @@ class TFadingSchema : public TWatchedNamespace {
 
 class FadingSchemaTest : public SpecErrorsTest {
   protected:
-    // From here on the schema is there for that many classes only.
+    // From now on the schema answers for that many classes.
     template <typename TFailure>
     void FadeAfter(int answers, const TFailure& failure)
     {
@@ -285,7 +285,7 @@ TEST_P(FadingSchemaTest, WhatIsNoExceptionOfTheHostPassesWithoutAWordInTheLog)
     EXPECT_EQ("Other exclude A:INCLUDE\n", Read(document));
 }
 
-// A schema that answers a number of times, and then with a null class.
+// A schema that answers a number of calls and then returns a null class.
 class TEmptyingSchema : public TWatchedNamespace {
   public:
     TEmptyingSchema(boost::shared_ptr<ICIMNamespace> ns, int answers)

@@ -15,7 +15,7 @@
 #include "host/TZELException.h"
 #include "tests/spec/TSpecFixture.h"
 
-// Present only where the program is built with the leak checker.
+// Null unless the program is built with the leak checker.
 extern "C" void __lsan_disable() __attribute__((weak));
 extern "C" void __lsan_enable() __attribute__((weak));
 
@@ -27,7 +27,7 @@ bool gIsMemoryShort = false;
 
 }  // namespace
 
-// Without memory for it, an array asked for in this form is a null pointer.
+// The form of new[] that returns a null pointer if there is no memory.
 void* operator new[](std::size_t size, const std::nothrow_t&) noexcept
 {
     if (gIsMemoryShort) {
@@ -42,7 +42,7 @@ void* operator new[](std::size_t size, const std::nothrow_t&) noexcept
 
 namespace NORVZEL20 {
 
-// Stands in front of the host's own operation, so that a test can have it say anything.
+// Replaces the host's own operation in this program, so a test can choose the size.
 std::uint64_t TOSSpecific::GetFileSize(std::string path)
 {
     if (gSizeFailure) {

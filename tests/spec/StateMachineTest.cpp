@@ -10,12 +10,12 @@ namespace {
 
 using TParser = TCIMDiffEngine::TDiffXMLParser;
 
-// Drives a parser by its events, without a document.
+// Calls the parser's events directly, without a document.
 class StateMachineTest : public TSpecFixture {
   protected:
     StateMachineTest() : fParser(fNamespaces[0]) {}
 
-    // What a start tag does: "accepted", "ignored", or the message that it ends the parse with.
+    // The effect of a start tag: "accepted", "ignored", or the message with which it ends the parse.
     std::string Start(const std::string& name)
     {
         std::map<std::string, std::string> attrs;

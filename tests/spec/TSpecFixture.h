@@ -17,9 +17,9 @@ class TSpecFixture : public testing::Test {
   protected:
     explicit TSpecFixture(EHost host = EHost::kPlain);
 
-    /// The rules that a document gives, or `status 9` for the exception that it ends with.
+    /// The rules that a document yields, or `status 9` if reading it throws kParseError (9).
     std::string Read(const std::string& document);
-    /// The same for a file.
+    /// The same, read from a file.
     std::string ReadFile(const std::string& path);
     /// What was logged since the last call; see TCapturingLogger.
     std::string TakeLog() { return fLog.Take(); }
@@ -30,7 +30,7 @@ class TSpecFixture : public testing::Test {
     std::unique_ptr<TCIMDiffEngine> fEngine;  // made without a specification; reads any number of them
 };
 
-/// The text of the status, as it stands in log entries.
+/// The text of the status in log entries.
 std::string TextOf(TZELStatusCode::EStatusCode status);
 
 }  // namespace NORVZEL20
