@@ -27,6 +27,7 @@ bool TCIMDiffEngine::TCompareInstances::operator()(boost::shared_ptr<ICIMInstanc
     }
     (*fMissingMap)[key].push_back(static_cast<int>(fNamespaceIndex));
     if (fRules->hasExcludedKeys()) {
+        // The key may stand for several instances. Its alias names the first one.
         const TCIMReference path = instance->GetReference(TCallContext());
         const boost::shared_ptr<ICIMClass> cls = instance->GetClass(TCallContext());
         fEngine->createObjectPathAlias(cls->GetName(TCallContext()), key, path, fNamespaceIndex);

@@ -12,6 +12,7 @@ TCallbackWrapClass::TCallbackWrapClass(boost::shared_ptr<ICIMNamespace> ns,
 
 bool TCallbackWrapClass::operator()(boost::shared_ptr<ICIMClass> cls) const
 {
+    // The namespace makes the wrapper, or returns the one that it has.
     return (*fCallback)(fNamespace->GetClass(cls->GetName(fContext), fContext));
 }
 

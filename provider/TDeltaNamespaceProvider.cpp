@@ -4,6 +4,9 @@
 #include "provider/DeltaNames.h"
 #include "provider/TDeltaNamespace.h"
 
+// The plug-in needs no entry point: the initialisation of kLoaded, below, registers the provider while the library is loaded. The
+// provider and its name are initialised on first use, so they exist whichever static object of a host asks first.
+
 namespace NORVZEL20 {
 
 namespace {

@@ -9,6 +9,14 @@
 #include "provider/DeltaNames.h"
 #include "spec/TDiffXMLParser.h"
 
+// Reading a specification file takes three steps, and each has its own errors:
+//
+//     (1) ask the host for the file's size, and refuse a file that is too large before it is opened
+//     (2) read the whole file into one buffer of that size
+//     (3) parse the buffer; the parser logs its own errors
+//
+// Only the status of an error is passed on, because the exceptions of host and parser may have types that callers do not know.
+
 namespace NORVZEL20 {
 
 namespace {

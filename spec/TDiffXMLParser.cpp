@@ -7,6 +7,14 @@
 #include "host/TRootObject.h"
 #include "spec/TStateStart.h"
 
+// The XML library calls StartElement, EndElement and characters; each passes the event to the state on top of the stack (see
+// TParseState.cpp). An error on the way takes one of two paths:
+//
+//     FatalError   the grammar or the schema does not know a name, or the XML is malformed: logs the reason and throws
+//     PassOn       the exception of a state, FatalError's among them, or of the schema: logs the tag's kind and line, throws again
+//
+// So a wrong name is logged twice, first with its reason and then with its tag. Malformed XML reaches FatalError directly.
+
 namespace NORVZEL20 {
 
 TCIMDiffEngine::TDiffXMLParser::TDiffXMLParser(boost::shared_ptr<ICIMNamespace> schema) : fSchema(std::move(schema))

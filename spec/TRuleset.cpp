@@ -33,6 +33,7 @@ void TCIMDiffEngine::TRuleset::addToRuleset(std::string className, boost::shared
 {
     const auto entry = fRules.find(className);
     if (entry == fRules.end()) {
+        // A copy, because later rules are merged into the entry and must not change the caller's.
         fRules[className] = boost::make_shared<TDiffClassRules>(rules->fDefault, rules->fProperties, rules->fExcludedKeys);
         return;
     }

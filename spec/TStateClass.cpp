@@ -31,6 +31,7 @@ void TCIMDiffEngine::TDiffXMLParser::TStateClass::EndElement(TDiffXMLParser& par
 void TCIMDiffEngine::TDiffXMLParser::TStateClass::HandleAttrs(TDiffXMLParser& parser, std::map<std::string, std::string>& attrs)
 {
     parser.fCurrentRules = boost::make_shared<TDiffClassRules>();
+    // The map orders the attributes by name, so the first error in that order is the one that is reported.
     for (const auto& [name, value] : attrs) {
         HandleAttr(parser, name, value);
     }

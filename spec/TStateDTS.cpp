@@ -21,6 +21,7 @@ void TCIMDiffEngine::TDiffXMLParser::TStateDTS::EndElement(TDiffXMLParser&, std:
 void TCIMDiffEngine::TDiffXMLParser::TStateDTS::HandleAttrs(TDiffXMLParser& parser, std::map<std::string, std::string>& attrs)
 {
     for (const auto& [name, value] : attrs) {
+        // Compared as text: "1.0.0" is greater than "1.0", and "0.9" is not.
         if (name != "version" || value.compare("1.0") > 0) {
             parser.FatalError("Unknown TCIMDiffEngineSpec version");
         }

@@ -14,6 +14,7 @@ void TCIMDiffEngine::TDiffXMLParser::TStateValue::EndElement(TDiffXMLParser& par
     fValue = parser.fCharData;
     parser.fCharData.clear();
     ValidateProperty(parser);
+    // Does nothing if the class lists the property already.
     parser.fCurrentRules->fProperties.emplace(fValue, fType);
     TParseState::EndElement(parser, name);
 }
