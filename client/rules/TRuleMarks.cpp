@@ -1,15 +1,15 @@
-// The plug-in's merge moves rules from element to class and from class to class; it overwrites what is there already or leaves it.
-// To learn which element ends up where, this file has the plug-in merge marks in place of rules.
+// To learn which element decides what, this file lets the plug-in's own merge run over marks in place of rules.
 //
-// The merge takes properties as names with one of two treatments, without looking at either. A mark is the number of an element in
-// binary, one made-up property a digit, with EXCLUDE for 1. Element 5 of 8, which lists Size, becomes rules that list
+// The merge copies, overwrites and hands down the treatments of properties by their names. What the names and the treatments are
+// makes no difference to it. So a mark is the position of an element in binary, spelled by made-up properties: one for each digit,
+// with EXCLUDE for 1 and INCLUDE for 0. The element at position 5 that lists Size becomes rules that list
 //
-//     "Size" \1 "0" = 1    "Size" \1 "1" = 0    "Size" \1 "2" = 1      the mark of Size
-//     ""     \1 "0" = 1    ""     \1 "1" = 0    ""     \1 "2" = 1      the mark of the default
+//     the mark of Size:           "Size" \1 "0" = 1     "Size" \1 "1" = 0     "Size" \1 "2" = 1
+//     the mark of the default:    ""     \1 "0" = 1     ""     \1 "1" = 0     ""     \1 "2" = 1
 //
-// All marks have the same digits, so one that overwrites another leaves nothing of it, and what a class's rules hold in the end is
-// the number of the element that decides. Excluded keys are only copied, as a whole: the number takes their place as a text.
-// The character \1 cannot occur in XML, hence not in a property that a file lists.
+// Every mark has the same number of digits, so that a mark replaces an earlier one as a whole. After the merge, the marks of a
+// class are the positions of the elements that decide there. Excluded keys are only ever copied together; the position takes their
+// place as one text. Made-up names cannot meet real ones, because the character \1 cannot occur in XML.
 #include "client/rules/TRuleMarks.h"
 
 #include <boost/smart_ptr/make_shared.hpp>
@@ -49,11 +49,6 @@ void TRuleMarks::Merge(std::size_t element)
     const std::string& className = fElements[element].className;
     fMarks.addToRuleset(className, boost::make_shared<TMarks>(TCIMDiffEngine::EXCLUDE, marks, keys), true);
     fMarks.updateRuleset(className, std::string(), fSchema);
-}
-
-bool TRuleMarks::HasRules(const std::string& className) const
-{
-    return Find(className) != nullptr;
 }
 
 bool TRuleMarks::IsFinal(const std::string& className) const

@@ -21,12 +21,10 @@ class TRuleMarks {
     /// No element is merged yet. `elements` must outlive this.
     TRuleMarks(const std::vector<TRulesDocument::TElement>& elements, boost::shared_ptr<ICIMNamespace> schema);
 
-    /// Merges the element into its class and hands the result down to all classes below it. To be called for each element in the
-    /// order of the file. Errors: those of the schema. Cost: that of the plug-in's merge, times the digits of a position.
+    /// Merges the element into its class and hands the result down to all classes below it. Call this for each element, in the
+    /// order of the file. Errors: those of the schema. Cost: that of the plug-in's merge, times the number of digits of a position.
     void Merge(std::size_t element);
 
-    /// Whether an element has reached the class, its own or an ancestor's.
-    bool HasRules(const std::string& className) const;
     /// Whether the class's rules are complete: no later element changes them.
     bool IsFinal(const std::string& className) const;
 

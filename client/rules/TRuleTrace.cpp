@@ -16,7 +16,6 @@
 
 #include "client/inventory/CollectObjects.h"
 #include "embedded/value/TNameText.h"
-#include "host/TAddToVectorCallback.h"
 
 namespace NORVZEL20 {
 
@@ -99,10 +98,9 @@ void TRuleTrace::WarnOfLateness(std::size_t index)
 void TRuleTrace::WarnOfOverruled(std::size_t index)
 {
     const TRulesDocument::TElement& element = fElements[index];
-    std::vector<boost::shared_ptr<ICIMClass>> below;
-    fSchema->GetClass(element.className, TCallContext())
-        ->EnumerateSubClasses(TAddToVectorCallback<ICIMClass>(&below), true, TCallContext());
-    for (const boost::shared_ptr<ICIMClass>& cls : below) {
+    const boost::shared_ptr<ICIMClass> top = fSchema->GetClass(element.className, TCallContext());
+    const auto enumerate = [&top](const auto& callback) { top->EnumerateSubClasses(callback, true, TCallContext()); };
+    for (const boost::shared_ptr<ICIMClass>& cls : Collect<ICIMClass>(enumerate)) {
         const auto own = fFirst.find(cls->GetName(TCallContext()));
         if (own != fFirst.end() && fMarks.FindDefault(own->first) == index) {
             Warn(own->second, fElements[own->second].line,
