@@ -13,7 +13,7 @@
 #include <algorithm>
 #include <boost/algorithm/string/join.hpp>
 
-#include "client/comparison/TCoverage.h"
+#include "client/inventory/RequireClass.h"
 #include "client/process/TClientError.h"
 #include "client/text/Counted.h"
 #include "client/text/DisplayText.h"
@@ -145,7 +145,7 @@ void TRulesListing::WriteWarnings()
 std::string TRulesListing::WriteExplanation(const std::string& className)
 {
     fOut.clear();
-    const boost::shared_ptr<TInMemClass> cls = RequireClass(className);
+    const boost::shared_ptr<TInMemClass> cls = RequireClass(fSchema, className);
     const std::vector<std::string> compared = fRules.PropertiesOf(cls);
     const std::vector<std::string>& keys = fRules.ExcludedKeysOf(cls->GetName());
     AddLine(cls->GetName() + ": " + (compared.empty() ? "not compared" : "compared") + "; default " +
@@ -163,7 +163,7 @@ std::string TRulesListing::WriteExplanation(const std::string& className)
 std::string TRulesListing::WriteExplanation(const std::string& className, const std::string& property)
 {
     fOut.clear();
-    const boost::shared_ptr<TInMemClass> cls = RequireClass(className);
+    const boost::shared_ptr<TInMemClass> cls = RequireClass(fSchema, className);
     const boost::shared_ptr<TInMemPropertyDecl> decl = cls->FindPropertyDecl(property);
     if (!decl) {
         throw TClientError(fSchema.path + ": class " + cls->GetName() + " has no property " + EscapeForDisplay(property) +
@@ -178,16 +178,6 @@ bool TRulesListing::HasElement(const std::string& className) const
     return std::any_of(fDocument.elements.begin(), fDocument.elements.end(), [&className](const TRulesDocument::TElement& element) {
         return TNameText::Equal(element.className, className);
     });
-}
-
-boost::shared_ptr<TInMemClass> TRulesListing::RequireClass(const std::string& className) const
-{
-    const boost::shared_ptr<TInMemClass> cls = fSchema.ns->FindClass(className);
-    if (!cls) {
-        throw TClientError(fSchema.path + ": declares no class " + EscapeForDisplay(className) + "; cimdelta show " + fSchema.path +
-                           " lists those it declares");
-    }
-    return cls;
 }
 
 std::string TRulesListing::Verdict(const TInMemClass& cls, const std::string& property,

@@ -34,7 +34,6 @@ class TRulesListing {
     void WriteUnmatched();
     void WriteWarnings();
     bool HasElement(const std::string& className) const;
-    boost::shared_ptr<TInMemClass> RequireClass(const std::string& className) const;
     std::string Verdict(const TInMemClass& cls, const std::string& property, const std::vector<std::string>& compared) const;
     std::string Reason(const TInMemClass& cls, const std::string& property, bool isCompared) const;
     std::string Origin(const TRuleTrace::TDecision& decision) const;

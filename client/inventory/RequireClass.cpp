@@ -1,0 +1,18 @@
+#include "client/inventory/RequireClass.h"
+
+#include "client/process/TClientError.h"
+#include "client/text/DisplayText.h"
+
+namespace NORVZEL20 {
+
+boost::shared_ptr<TInMemClass> RequireClass(const TInventory& inventory, const std::string& name)
+{
+    const boost::shared_ptr<TInMemClass> cls = inventory.ns->FindClass(name);
+    if (!cls) {
+        throw TClientError(inventory.path + ": declares no class " + EscapeForDisplay(name) + "; cimdelta show " + inventory.path +
+                           " lists those it declares");
+    }
+    return cls;
+}
+
+}  // namespace NORVZEL20
