@@ -64,46 +64,46 @@ void TCimXmlClassMaker::FailSecond(const char* what, const std::string& name, co
 
 void TCimXmlClassMaker::AddProperty(TInMemClass& cls, const TEmbeddedObject::TProperty& property, const TInMemClass* super)
 {
-    fContext.CheckName("property", property.fName);
-    const TCIMValue::TCIMType type = property.fValue.GetType();
+    fContext.CheckName("property", property.name);
+    const TCIMValue::TCIMType type = property.value.GetType();
     const boost::shared_ptr<TInMemPropertyDecl> inherited =
-        super != nullptr ? super->FindPropertyDecl(property.fName) : boost::shared_ptr<TInMemPropertyDecl>();
+        super != nullptr ? super->FindPropertyDecl(property.name) : boost::shared_ptr<TInMemPropertyDecl>();
     if (inherited && inherited->GetType() != type) {
-        fContext.Fail(EStatus::kTypeMismatch, "found property " + Quote(property.fName) + " of type " +
+        fContext.Fail(EStatus::kTypeMismatch, "found property " + Quote(property.name) + " of type " +
                                                   TValueText::DescribeType(type) + " in class " + Quote(cls.GetName()) +
                                                   ", but a superclass declares it as " +
                                                   TValueText::DescribeType(inherited->GetType()));
     }
-    if (inherited && property.fPropagated) {
+    if (inherited && property.propagated) {
         return;
     }
-    const auto decl = boost::make_shared<TInMemPropertyDecl>(property.fName, property.fValue);
-    decl->SetReferenceClass(property.fReferenceClass);
-    decl->SetArraySize(property.fArraySize);
-    AddQualifiers(*decl, property.fQualifiers, inherited ? &inherited->GetQualifiers() : nullptr);
+    const auto decl = boost::make_shared<TInMemPropertyDecl>(property.name, property.value);
+    decl->SetReferenceClass(property.referenceClass);
+    decl->SetArraySize(property.arraySize);
+    AddQualifiers(*decl, property.qualifiers, inherited ? &inherited->GetQualifiers() : nullptr);
     if (!cls.AddPropertyDecl(decl)) {
-        FailSecond("property", property.fName, cls);
+        FailSecond("property", property.name, cls);
     }
 }
 
 void TCimXmlClassMaker::AddMethod(TInMemClass& cls, const TEmbeddedObject::TMethod& method, const TInMemClass* super)
 {
     const boost::shared_ptr<TInMemMethodDecl> inherited =
-        super != nullptr ? super->GetMethods().Find(method.fName) : boost::shared_ptr<TInMemMethodDecl>();
-    if (inherited && method.fPropagated) {
+        super != nullptr ? super->GetMethods().Find(method.name) : boost::shared_ptr<TInMemMethodDecl>();
+    if (inherited && method.propagated) {
         return;
     }
-    const auto decl = boost::make_shared<TInMemMethodDecl>(method.fName, method.fType);
-    for (const TEmbeddedObject::TParameter& parameter : method.fParameters) {
-        const auto made = boost::make_shared<TInMemParameter>(parameter.fName, parameter.fType);
-        made->SetReferenceClass(parameter.fReferenceClass);
-        made->SetArraySize(parameter.fArraySize);
-        AddQualifiers(*made, parameter.fQualifiers, nullptr);
+    const auto decl = boost::make_shared<TInMemMethodDecl>(method.name, method.type);
+    for (const TEmbeddedObject::TParameter& parameter : method.parameters) {
+        const auto made = boost::make_shared<TInMemParameter>(parameter.name, parameter.type);
+        made->SetReferenceClass(parameter.referenceClass);
+        made->SetArraySize(parameter.arraySize);
+        AddQualifiers(*made, parameter.qualifiers, nullptr);
         decl->AddParameter(made);
     }
-    AddQualifiers(*decl, method.fQualifiers, inherited ? &inherited->GetQualifiers() : nullptr);
+    AddQualifiers(*decl, method.qualifiers, inherited ? &inherited->GetQualifiers() : nullptr);
     if (!cls.AddMethodDecl(decl)) {
-        FailSecond("method", method.fName, cls);
+        FailSecond("method", method.name, cls);
     }
 }
 
@@ -117,26 +117,26 @@ void TCimXmlClassMaker::AddQualifiers(TElement& element, const TQualifiers& qual
     for (const TEmbeddedObject::TQualifier& qualifier : qualifiers) {
         boost::shared_ptr<ICIMQualifier> above;
         if (inherited != nullptr) {
-            above = inherited->Find(qualifier.fName);
+            above = inherited->Find(qualifier.name);
         }
-        if (above && qualifier.fPropagated) {
+        if (above && qualifier.propagated) {
             continue;
         }
         NoteQualifier(qualifier, above.get());
-        element.AddQualifier(boost::make_shared<TInMemQualifier>(qualifier.fName, qualifier.fValue, qualifier.fFlavor));
+        element.AddQualifier(boost::make_shared<TInMemQualifier>(qualifier.name, qualifier.value, qualifier.flavor));
     }
 }
 
 /// Notes what is odd about a qualifier. Real servers write undeclared ones, published schemas restate flavors.
 void TCimXmlClassMaker::NoteQualifier(const TEmbeddedObject::TQualifier& qualifier, const ICIMQualifier* inherited)
 {
-    if (!fNamespace.FindQualifierDecl(qualifier.fName)) {
+    if (!fNamespace.FindQualifierDecl(qualifier.name)) {
         fContext.Tolerate("undeclared qualifier",
-                          "qualifier " + Quote(qualifier.fName) + " is not declared; taken as it is written");
+                          "qualifier " + Quote(qualifier.name) + " is not declared; taken as it is written");
     }
-    if (inherited != nullptr && inherited->GetFlavor(TCallContext()) != qualifier.fFlavor) {
+    if (inherited != nullptr && inherited->GetFlavor(TCallContext()) != qualifier.flavor) {
         fContext.Tolerate("other flavor",
-                          "qualifier " + Quote(qualifier.fName) +
+                          "qualifier " + Quote(qualifier.name) +
                               " is restated with another flavor than the superclass gives it; taken as it is written");
     }
 }

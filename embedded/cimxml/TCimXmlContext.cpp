@@ -71,11 +71,7 @@ bool TCimXmlContext::IsOwn(const std::string& name, const std::string& host) con
 /// Other characters, such as a dot, a comma or a colon, could make two different paths read the same.
 void TCimXmlContext::CheckName(const char* what, std::string_view name) const
 {
-    const auto isPart = [](char c) {
-        const char lower = TNameText::ToLower(c);
-        return (lower >= 'a' && lower <= 'z') || (c >= '0' && c <= '9') || c == '_' || static_cast<unsigned char>(c) >= 0x80;
-    };
-    if (!std::all_of(name.begin(), name.end(), isPart)) {
+    if (!std::all_of(name.begin(), name.end(), TNameText::IsNamePart)) {
         Fail(TZELStatusCode::kParseError,
              std::string("found ") + what + " " + Quote(name) + ", expected a name of letters, digits and underscores");
     }

@@ -55,16 +55,16 @@ void TCimXmlDraftBuilder::BeginProperty(const char* name, const TCimXmlAttribute
     }
     fPropertyPlace = fContext.GetPlace();
     fProperty.emplace();
-    fProperty->fName = name;
-    fProperty->fReferenceClass = attributes.Get("REFERENCECLASS");
-    fProperty->fArraySize = ReadArraySize(attributes);
-    fProperty->fClassOrigin = attributes.Get("CLASSORIGIN");
-    fProperty->fPropagated = attributes.IsTrue("PROPAGATED", false);
+    fProperty->name = name;
+    fProperty->referenceClass = attributes.Get("REFERENCECLASS");
+    fProperty->arraySize = ReadArraySize(attributes);
+    fProperty->classOrigin = attributes.Get("CLASSORIGIN");
+    fProperty->propagated = attributes.IsTrue("PROPAGATED", false);
 }
 
 void TCimXmlDraftBuilder::EndProperty(TCIMValue value)
 {
-    fProperty->fValue = std::move(value);
+    fProperty->value = std::move(value);
     fDraft->object.AddProperty(std::move(*fProperty));
     fDraft->propertyPlaces.push_back(fPropertyPlace);
     fProperty.reset();
@@ -77,10 +77,10 @@ void TCimXmlDraftBuilder::BeginMethod(const TCimXmlAttributes& attributes)
     const char* name = attributes.Require("NAME");
     CheckRoom(fDraft->object.GetMethods().size(), TSchemaLimits::kMaxMethods, "methods");
     fMethod.emplace();
-    fMethod->fName = name;
-    fMethod->fType = type;
-    fMethod->fClassOrigin = attributes.Get("CLASSORIGIN");
-    fMethod->fPropagated = attributes.IsTrue("PROPAGATED", false);
+    fMethod->name = name;
+    fMethod->type = type;
+    fMethod->classOrigin = attributes.Get("CLASSORIGIN");
+    fMethod->propagated = attributes.IsTrue("PROPAGATED", false);
 }
 
 void TCimXmlDraftBuilder::EndMethod()
@@ -97,31 +97,31 @@ void TCimXmlDraftBuilder::BeginParameter(const TCimXmlAttributes& attributes)
     const TType type = isReference ? TType(TType::kReference) : attributes.RequireType();
     const char* name = attributes.Require("NAME");
     fParameter.emplace();
-    fParameter->fName = name;
-    fParameter->fType = isArray ? type.GetArrayType() : type;
-    fParameter->fReferenceClass = attributes.Get("REFERENCECLASS");
-    fParameter->fArraySize = ReadArraySize(attributes);
+    fParameter->name = name;
+    fParameter->type = isArray ? type.GetArrayType() : type;
+    fParameter->referenceClass = attributes.Get("REFERENCECLASS");
+    fParameter->arraySize = ReadArraySize(attributes);
 }
 
 void TCimXmlDraftBuilder::EndParameter()
 {
-    fMethod->fParameters.push_back(std::move(*fParameter));
+    fMethod->parameters.push_back(std::move(*fParameter));
     fParameter.reset();
 }
 
 void TCimXmlDraftBuilder::AddQualifier(TEmbeddedObject::TQualifier qualifier)
 {
-    const auto& there = fParameter  ? fParameter->fQualifiers
-                        : fMethod   ? fMethod->fQualifiers
-                        : fProperty ? fProperty->fQualifiers
+    const auto& there = fParameter  ? fParameter->qualifiers
+                        : fMethod   ? fMethod->qualifiers
+                        : fProperty ? fProperty->qualifiers
                                     : fDraft->object.GetQualifiers();
     CheckRoom(there.size(), TSchemaLimits::kMaxQualifiers, "qualifiers on one element");
     if (fParameter) {
-        fParameter->fQualifiers.push_back(std::move(qualifier));
+        fParameter->qualifiers.push_back(std::move(qualifier));
     } else if (fMethod) {
-        fMethod->fQualifiers.push_back(std::move(qualifier));
+        fMethod->qualifiers.push_back(std::move(qualifier));
     } else if (fProperty) {
-        fProperty->fQualifiers.push_back(std::move(qualifier));
+        fProperty->qualifiers.push_back(std::move(qualifier));
     } else {
         fDraft->object.AddQualifier(std::move(qualifier));
     }

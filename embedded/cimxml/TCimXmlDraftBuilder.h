@@ -26,7 +26,7 @@ class TCimXmlDraftBuilder {
     /// The value, and with it the type, comes at the end.
     void BeginProperty(const char* name, const TCimXmlAttributes& attributes);
     /// The name of the property that is open; valid until it ends.
-    const std::string& GetPropertyName() const noexcept { return fProperty->fName; }
+    const std::string& GetPropertyName() const noexcept { return fProperty->name; }
     void EndProperty(TCIMValue value);
     void BeginMethod(const TCimXmlAttributes& attributes);
     void EndMethod();

@@ -106,8 +106,8 @@ void TCimXmlInstanceBuilder::Fill(const TCimXmlDraft& draft, const TReadObjects&
     for (std::size_t index = 0; index < object.GetProperties().size(); ++index) {
         const TCimXmlContext::TAt at(fContext, draft.propertyPlaces[index]);
         const TEmbeddedObject::TProperty& property = object.GetProperties()[index];
-        const TCimXmlTarget target = FindProperty(property.fName.c_str());
-        TCIMValue value = target.isEmbedded ? readObjects(property.fValue) : property.fValue;
+        const TCimXmlTarget target = FindProperty(property.name.c_str());
+        TCIMValue value = target.isEmbedded ? readObjects(property.value) : property.value;
         adapter.Adapt(value);
         SetProperty(target, std::move(value), false);
     }

@@ -38,30 +38,30 @@ TQualifiers FromQualifiers(const TElement& element, const TInMemory* inMemory)
 TEmbeddedObject::TProperty FromPropertyDecl(const ICIMPropertyDecl& decl)
 {
     TEmbeddedObject::TProperty property;
-    property.fName = decl.GetName(TCallContext());
-    property.fValue = decl.GetDefaultValue(TCallContext());
+    property.name = decl.GetName(TCallContext());
+    property.value = decl.GetDefaultValue(TCallContext());
     const auto* inMemory = dynamic_cast<const TInMemPropertyDecl*>(&decl);
     if (inMemory != nullptr) {
-        property.fReferenceClass = inMemory->GetReferenceClass();
-        property.fArraySize = inMemory->GetArraySize();
+        property.referenceClass = inMemory->GetReferenceClass();
+        property.arraySize = inMemory->GetArraySize();
     }
-    property.fQualifiers = FromQualifiers(decl, inMemory);
+    property.qualifiers = FromQualifiers(decl, inMemory);
     return property;
 }
 
 TEmbeddedObject::TMethod FromMethodDecl(const ICIMMethodDecl& decl)
 {
     TEmbeddedObject::TMethod method;
-    method.fName = decl.GetName(TCallContext());
-    method.fType = decl.GetType(TCallContext());
+    method.name = decl.GetName(TCallContext());
+    method.type = decl.GetType(TCallContext());
     const auto* inMemory = dynamic_cast<const TInMemMethodDecl*>(&decl);
-    method.fQualifiers = FromQualifiers(decl, inMemory);
+    method.qualifiers = FromQualifiers(decl, inMemory);
     if (inMemory == nullptr) {
         return method;
     }
     for (const boost::shared_ptr<TInMemParameter>& parameter : inMemory->GetParameters()) {
-        method.fParameters.push_back({parameter->GetName(), parameter->GetType(), parameter->GetReferenceClass(),
-                                      parameter->GetArraySize(), FromQualifiers(*parameter, parameter.get())});
+        method.parameters.push_back({parameter->GetName(), parameter->GetType(), parameter->GetReferenceClass(),
+                                     parameter->GetArraySize(), FromQualifiers(*parameter, parameter.get())});
     }
     return method;
 }
@@ -96,13 +96,13 @@ std::vector<TElement> OwnOf(const std::vector<TElement>& elements)
 {
     std::vector<TElement> own;
     for (const TElement& element : elements) {
-        if (!element.fPropagated) {
+        if (!element.propagated) {
             own.push_back(element);
         }
     }
     if constexpr (!std::is_same_v<TElement, TEmbeddedObject::TQualifier>) {
         for (TElement& element : own) {
-            element.fQualifiers = OwnOf(element.fQualifiers);
+            element.qualifiers = OwnOf(element.qualifiers);
         }
     }
     return own;
@@ -148,14 +148,14 @@ TEmbeddedObject::TProperty TCimXmlObjects::FromProperty(const ICIMProperty& prop
 {
     const boost::shared_ptr<const ICIMPropertyDecl> decl = property.GetPropertyDecl(TCallContext());
     TEmbeddedObject::TProperty result;
-    result.fName = decl->GetName(TCallContext());
-    result.fValue = property.GetValue(TCallContext());
+    result.name = decl->GetName(TCallContext());
+    result.value = property.GetValue(TCallContext());
     if (const auto* inMemory = dynamic_cast<const TInMemPropertyDecl*>(decl.get())) {
-        result.fReferenceClass = inMemory->GetReferenceClass();
-        result.fArraySize = inMemory->GetArraySize();
+        result.referenceClass = inMemory->GetReferenceClass();
+        result.arraySize = inMemory->GetArraySize();
     }
-    if (result.fValue.IsNull()) {
-        result.fValue = TCIMValue::Null(decl->GetType(TCallContext()));
+    if (result.value.IsNull()) {
+        result.value = TCIMValue::Null(decl->GetType(TCallContext()));
     }
     return result;
 }

@@ -331,7 +331,7 @@ void TCimXmlReader::EndQualifier()
     fItem = &fProperty;
     if (fIsDirect) {
         return fContext.Tolerate("qualifier of an instance",
-                                 "qualifier " + Quote(qualifier.fName) + " stands on an instance or its property; left out");
+                                 "qualifier " + Quote(qualifier.name) + " stands on an instance or its property; left out");
     }
     fDraft.AddQualifier(std::move(qualifier));
 }

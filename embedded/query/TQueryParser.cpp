@@ -7,6 +7,8 @@
 
 #include "embedded/query/TQueryParser.h"
 
+#include <algorithm>
+#include <iterator>
 #include <utility>
 
 #include "embedded/query/TQueryError.h"
@@ -21,12 +23,8 @@ const char* const kKeywords[] = {"SELECT", "FROM", "WHERE", "AND", "OR", "NOT", 
 
 bool IsAnyKeyword(const std::string& name)
 {
-    for (const char* const keyword : kKeywords) {
-        if (TNameText::Equal(name, keyword)) {
-            return true;
-        }
-    }
-    return false;
+    return std::any_of(std::begin(kKeywords), std::end(kKeywords),
+                       [&name](const char* keyword) { return TNameText::Equal(name, keyword); });
 }
 
 const std::pair<const char*, TQueryCondition::EKind> kComparisons[] = {

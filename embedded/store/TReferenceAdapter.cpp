@@ -168,7 +168,7 @@ bool TReferenceAdapter::AdaptObject(TCIMValue& value) const
     std::vector<TEmbeddedObject::TProperty> properties = object->GetProperties();
     bool isChanged = false;
     for (TEmbeddedObject::TProperty& property : properties) {
-        isChanged = Adapt(property.fValue) || isChanged;
+        isChanged = Adapt(property.value) || isChanged;
     }
     if (!isChanged) {
         return false;

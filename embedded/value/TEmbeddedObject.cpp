@@ -31,8 +31,7 @@ std::vector<const T*> SortByName(const std::vector<T>& elements)
     for (const T& element : elements) {
         sorted.push_back(&element);
     }
-    std::stable_sort(sorted.begin(), sorted.end(),
-                     [](const T* a, const T* b) { return TNameText::Compare(a->fName, b->fName) < 0; });
+    std::stable_sort(sorted.begin(), sorted.end(), [](const T* a, const T* b) { return TNameText::Compare(a->name, b->name) < 0; });
     return sorted;
 }
 
@@ -44,30 +43,28 @@ bool EqualSorted(const std::vector<const T*>& a, const std::vector<const T*>& b)
 
 bool Equal(const TEmbeddedObject::TQualifier& a, const TEmbeddedObject::TQualifier& b)
 {
-    return TNameText::Equal(a.fName, b.fName) && a.fFlavor == b.fFlavor && a.fValue.GetType() == b.fValue.GetType() &&
-           a.fValue == b.fValue;
+    return TNameText::Equal(a.name, b.name) && a.flavor == b.flavor && a.value.GetType() == b.value.GetType() && a.value == b.value;
 }
 
 bool Equal(const TEmbeddedObject::TProperty& a, const TEmbeddedObject::TProperty& b)
 {
-    return TNameText::Equal(a.fName, b.fName) && a.fArraySize == b.fArraySize && a.fValue.GetType() == b.fValue.GetType() &&
-           TNameText::Equal(a.fReferenceClass, b.fReferenceClass) && a.fValue == b.fValue &&
-           EqualSorted(SortByName(a.fQualifiers), SortByName(b.fQualifiers));
+    return TNameText::Equal(a.name, b.name) && a.arraySize == b.arraySize && a.value.GetType() == b.value.GetType() &&
+           TNameText::Equal(a.referenceClass, b.referenceClass) && a.value == b.value &&
+           EqualSorted(SortByName(a.qualifiers), SortByName(b.qualifiers));
 }
 
 bool Equal(const TEmbeddedObject::TParameter& a, const TEmbeddedObject::TParameter& b)
 {
-    return TNameText::Equal(a.fName, b.fName) && a.fArraySize == b.fArraySize && a.fType == b.fType &&
-           TNameText::Equal(a.fReferenceClass, b.fReferenceClass) &&
-           EqualSorted(SortByName(a.fQualifiers), SortByName(b.fQualifiers));
+    return TNameText::Equal(a.name, b.name) && a.arraySize == b.arraySize && a.type == b.type &&
+           TNameText::Equal(a.referenceClass, b.referenceClass) && EqualSorted(SortByName(a.qualifiers), SortByName(b.qualifiers));
 }
 
 bool Equal(const TEmbeddedObject::TMethod& a, const TEmbeddedObject::TMethod& b)
 {
-    return TNameText::Equal(a.fName, b.fName) && a.fType == b.fType &&
-           std::equal(a.fParameters.begin(), a.fParameters.end(), b.fParameters.begin(), b.fParameters.end(),
+    return TNameText::Equal(a.name, b.name) && a.type == b.type &&
+           std::equal(a.parameters.begin(), a.parameters.end(), b.parameters.begin(), b.parameters.end(),
                       [](const auto& x, const auto& y) { return Equal(x, y); }) &&
-           EqualSorted(SortByName(a.fQualifiers), SortByName(b.fQualifiers));
+           EqualSorted(SortByName(a.qualifiers), SortByName(b.qualifiers));
 }
 
 /// The same for arrays with the same elements in any order.
@@ -88,7 +85,7 @@ std::vector<const TEmbeddedObject::TProperty*> GetComparedProperties(const TEmbe
 {
     auto properties = SortByName(object.GetProperties());
     if (!object.IsClass()) {
-        const auto isNull = [](const TEmbeddedObject::TProperty* property) { return property->fValue.IsNull(); };
+        const auto isNull = [](const TEmbeddedObject::TProperty* property) { return property->value.IsNull(); };
         properties.erase(std::remove_if(properties.begin(), properties.end(), isNull), properties.end());
     }
     return properties;
@@ -101,7 +98,7 @@ TEmbeddedObject::TEmbeddedObject(std::string className, bool isClass) : fClassNa
 const TEmbeddedObject::TProperty* TEmbeddedObject::FindProperty(std::string_view name) const noexcept
 {
     const auto found = std::find_if(fProperties.begin(), fProperties.end(),
-                                    [name](const TProperty& property) { return TNameText::Equal(property.fName, name); });
+                                    [name](const TProperty& property) { return TNameText::Equal(property.name, name); });
     return found != fProperties.end() ? &*found : nullptr;
 }
 
@@ -138,8 +135,8 @@ std::size_t TEmbeddedObject::Hash() const
 {
     std::size_t hash = TNameText::Hash(fClassName) + (fIsClass ? 1u : 0u);
     for (const TProperty& property : fProperties) {
-        hash += property.fValue.IsNull() ? 0 : TNameText::Hash(property.fName);
-        hash += HashWithoutOrder(property.fValue) * 31;
+        hash += property.value.IsNull() ? 0 : TNameText::Hash(property.name);
+        hash += HashWithoutOrder(property.value) * 31;
     }
     return hash;
 }

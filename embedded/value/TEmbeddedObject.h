@@ -18,34 +18,34 @@ namespace NORVZEL20 {
 class CIMDELTA_INTERNAL_EXPORT TEmbeddedObject {
   public:
     struct TQualifier {
-        std::string fName;
-        TCIMValue fValue;  ///< a typed null if there is no value
-        ICIMQualifierDecl::EFlavor fFlavor = ICIMQualifierDecl::kFlavorDefault;
-        bool fPropagated = false;
+        std::string name;
+        TCIMValue value;  ///< a typed null if there is no value
+        ICIMQualifierDecl::EFlavor flavor = ICIMQualifierDecl::kFlavorDefault;
+        bool propagated = false;
     };
     struct TProperty {
-        std::string fName;
-        TCIMValue fValue;             ///< a typed null if there is no value
-        std::string fReferenceClass;  ///< the class that a reference may refer to; empty for any
-        unsigned int fArraySize = 0;  ///< the number of elements of an array of fixed size, otherwise 0
-        std::string fClassOrigin;
-        bool fPropagated = false;
-        std::vector<TQualifier> fQualifiers;
+        std::string name;
+        TCIMValue value;             ///< a typed null if there is no value
+        std::string referenceClass;  ///< the class that a reference may refer to; empty for any
+        unsigned int arraySize = 0;  ///< the number of elements of an array of fixed size, otherwise 0
+        std::string classOrigin;
+        bool propagated = false;
+        std::vector<TQualifier> qualifiers;
     };
     struct TParameter {
-        std::string fName;
-        TCIMValue::TCIMType fType = TCIMValue::TCIMType::kNone;
-        std::string fReferenceClass;
-        unsigned int fArraySize = 0;
-        std::vector<TQualifier> fQualifiers;
+        std::string name;
+        TCIMValue::TCIMType type = TCIMValue::TCIMType::kNone;
+        std::string referenceClass;
+        unsigned int arraySize = 0;
+        std::vector<TQualifier> qualifiers;
     };
     struct TMethod {
-        std::string fName;
-        TCIMValue::TCIMType fType = TCIMValue::TCIMType::kNone;  ///< the type of the result; kNone if there is no result
-        std::string fClassOrigin;
-        bool fPropagated = false;
-        std::vector<TParameter> fParameters;
-        std::vector<TQualifier> fQualifiers;
+        std::string name;
+        TCIMValue::TCIMType type = TCIMValue::TCIMType::kNone;  ///< the type of the result; kNone if there is no result
+        std::string classOrigin;
+        bool propagated = false;
+        std::vector<TParameter> parameters;
+        std::vector<TQualifier> qualifiers;
     };
 
     /// An instance of the class `className`, or the class itself.

@@ -223,12 +223,12 @@ const TObject* FindObject(const TCIMValue& value)
 
 void AppendParameter(std::string& out, const TObject::TParameter& parameter)
 {
-    const std::string element = GetKindName("PARAMETER", parameter.fType);
+    const std::string element = GetKindName("PARAMETER", parameter.type);
     out.append(1, '<').append(element);
-    TValueXml::AppendAttribute(out, "NAME", parameter.fName);
-    AppendTypeAttributes(out, parameter.fType, parameter.fReferenceClass, parameter.fArraySize);
+    TValueXml::AppendAttribute(out, "NAME", parameter.name);
+    AppendTypeAttributes(out, parameter.type, parameter.referenceClass, parameter.arraySize);
     out += '>';
-    AppendQualifiers(out, parameter.fQualifiers);
+    AppendQualifiers(out, parameter.qualifiers);
     out.append("</").append(element).append(1, '>');
 }
 
@@ -300,45 +300,45 @@ void TValueXml::AppendQualifier(std::string& out, const TEmbeddedObject::TQualif
 {
     using TDecl = ICIMQualifierDecl;
     out += "<QUALIFIER";
-    AppendAttribute(out, "NAME", qualifier.fName);
-    AppendAttribute(out, "TYPE", GetWrittenType(qualifier.fValue.GetType()));
-    AppendFlag(out, "PROPAGATED", qualifier.fPropagated, false);
-    AppendFlag(out, "OVERRIDABLE", (qualifier.fFlavor & TDecl::kFlavorOverridable) != 0, true);
-    AppendFlag(out, "TOSUBCLASS", (qualifier.fFlavor & TDecl::kFlavorToSubclass) != 0, true);
-    AppendFlag(out, "TOINSTANCE", (qualifier.fFlavor & TDecl::kFlavorToInstance) != 0, false);
-    AppendFlag(out, "TRANSLATABLE", (qualifier.fFlavor & TDecl::kFlavorTranslatable) != 0, false);
+    AppendAttribute(out, "NAME", qualifier.name);
+    AppendAttribute(out, "TYPE", GetWrittenType(qualifier.value.GetType()));
+    AppendFlag(out, "PROPAGATED", qualifier.propagated, false);
+    AppendFlag(out, "OVERRIDABLE", (qualifier.flavor & TDecl::kFlavorOverridable) != 0, true);
+    AppendFlag(out, "TOSUBCLASS", (qualifier.flavor & TDecl::kFlavorToSubclass) != 0, true);
+    AppendFlag(out, "TOINSTANCE", (qualifier.flavor & TDecl::kFlavorToInstance) != 0, false);
+    AppendFlag(out, "TRANSLATABLE", (qualifier.flavor & TDecl::kFlavorTranslatable) != 0, false);
     out += '>';
-    AppendValue(out, qualifier.fValue);
+    AppendValue(out, qualifier.value);
     out += "</QUALIFIER>";
 }
 
 void TValueXml::AppendProperty(std::string& out, const TEmbeddedObject::TProperty& property)
 {
-    const std::string element = GetKindName("PROPERTY", property.fValue.GetType());
+    const std::string element = GetKindName("PROPERTY", property.value.GetType());
     out.append(1, '<').append(element);
-    AppendAttribute(out, "NAME", property.fName);
-    AppendTypeAttributes(out, property.fValue.GetType(), property.fReferenceClass, property.fArraySize);
-    AppendOrigin(out, property.fClassOrigin, property.fPropagated);
-    if (const TObject* const object = FindObject(property.fValue)) {
+    AppendAttribute(out, "NAME", property.name);
+    AppendTypeAttributes(out, property.value.GetType(), property.referenceClass, property.arraySize);
+    AppendOrigin(out, property.classOrigin, property.propagated);
+    if (const TObject* const object = FindObject(property.value)) {
         AppendAttribute(out, "EmbeddedObject", object->IsClass() ? "object" : "instance");
     }
     out += '>';
-    AppendQualifiers(out, property.fQualifiers);
-    AppendValue(out, property.fValue);
+    AppendQualifiers(out, property.qualifiers);
+    AppendValue(out, property.value);
     out.append("</").append(element).append(1, '>');
 }
 
 void TValueXml::AppendMethod(std::string& out, const TEmbeddedObject::TMethod& method)
 {
     out += "<METHOD";
-    AppendAttribute(out, "NAME", method.fName);
-    if (method.fType != TType::kNone) {
-        AppendAttribute(out, "TYPE", TValueText::GetTypeName(method.fType));
+    AppendAttribute(out, "NAME", method.name);
+    if (method.type != TType::kNone) {
+        AppendAttribute(out, "TYPE", TValueText::GetTypeName(method.type));
     }
-    AppendOrigin(out, method.fClassOrigin, method.fPropagated);
+    AppendOrigin(out, method.classOrigin, method.propagated);
     out += '>';
-    AppendQualifiers(out, method.fQualifiers);
-    for (const TObject::TParameter& parameter : method.fParameters) {
+    AppendQualifiers(out, method.qualifiers);
+    for (const TObject::TParameter& parameter : method.parameters) {
         AppendParameter(out, parameter);
     }
     out += "</METHOD>";

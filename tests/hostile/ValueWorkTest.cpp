@@ -22,8 +22,8 @@ TEST(BagTest, BagsOfObjectsThatDifferInTheirArraysAreComparedInProportion)
     for (unsigned int number = 0; number < kObjects; ++number) {
         TEmbeddedObject object("X");
         TEmbeddedObject::TProperty property;
-        property.fName = "P";
-        property.fValue = TCIMValue(TCIMValue::TCIMType::kArrayUint32, 2, {TCIMValue(number), TCIMValue(7U)});
+        property.name = "P";
+        property.value = TCIMValue(TCIMValue::TCIMType::kArrayUint32, 2, {TCIMValue(number), TCIMValue(7U)});
         object.AddProperty(std::move(property));
         objects.emplace_back(boost::make_shared<const TEmbeddedObject>(std::move(object)));
     }

@@ -60,7 +60,7 @@ bool MatchesText(const TCIMValue& value, const TJson& expected)
         return true;
     }
     for (const auto& [name, property] : expected.at("properties").items()) {
-        if (!object->FindProperty(name) || !Matches(object->FindProperty(name)->fValue, property.at("value"))) {
+        if (!object->FindProperty(name) || !Matches(object->FindProperty(name)->value, property.at("value"))) {
             return false;
         }
     }

@@ -13,8 +13,8 @@ using TType = TCIMValue::TCIMType;
 TObject::TProperty Property(const char* name, const TCIMValue& value)
 {
     TObject::TProperty property;
-    property.fName = name;
-    property.fValue = value;
+    property.name = name;
+    property.value = value;
     return property;
 }
 
@@ -101,7 +101,7 @@ TEST(EmbeddedObjectTest, SuperclassAndMethodsCount)
 TEST(EmbeddedObjectTest, PropertiesAreFoundInAnySpelling)
 {
     const TObject object = Object({Property("Size", TCIMValue(1))});
-    EXPECT_EQ("Size", object.FindProperty("SIZE")->fName);
+    EXPECT_EQ("Size", object.FindProperty("SIZE")->name);
     EXPECT_EQ(nullptr, object.FindProperty("Sizes"));
 }
 
