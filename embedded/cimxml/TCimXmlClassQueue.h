@@ -9,6 +9,7 @@
 #include "embedded/store/TInMemNamespace.h"
 #include "embedded/store/TInMemStaging.h"
 #include "embedded/value/TNameText.h"
+#include "host/Export.h"
 #include "host/ICIMElement.h"
 
 namespace NORVZEL20 {
@@ -16,7 +17,7 @@ namespace NORVZEL20 {
 /// The classes that a document declares. They may come in any order: each waits until it is needed or the document ends.
 ///
 /// Errors: every operation but the counts fails through the context, at the place of the class concerned.
-class TCimXmlClassQueue {
+class CIMDELTA_INTERNAL_EXPORT TCimXmlClassQueue {
   public:
     /// All arguments must outlive the queue. `staging` is one of `ns`.
     TCimXmlClassQueue(TCimXmlContext& context, TInMemNamespace& ns, TInMemStaging& staging) noexcept
