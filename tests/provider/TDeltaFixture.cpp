@@ -1,7 +1,6 @@
 #include "tests/provider/TDeltaFixture.h"
 
 #include "embedded/services/TAssertionFailure.h"
-#include "host/TZELException.h"
 
 namespace NORVZEL20 {
 
@@ -20,16 +19,6 @@ TCallContext TDeltaFixture::At(unsigned short index)
     TCallContext context;
     context["nsIndex"] = TCIMValue(index);
     return context;
-}
-
-int StatusOf(const std::function<void()>& call)
-{
-    try {
-        call();
-    } catch (const TZELException& error) {
-        return error.GetStatusCode().GetStatus();
-    }
-    return 0;
 }
 
 bool FailsOnNull(const std::function<void()>& call)

@@ -5,6 +5,7 @@
 #include <functional>
 #include <string>
 
+#include "tests/support/StatusOf.h"
 #include "tests/support/TCapturingLogger.h"
 #include "tests/support/TComparisonRun.h"
 
@@ -29,8 +30,6 @@ class TDeltaFixture : public testing::Test {
     TComparisonRun fComparison;
 };
 
-/// The status that the call throws, or kSuccess (0) if it throws nothing.
-int StatusOf(const std::function<void()>& call);
 /// Whether the call fails the host's assertion "px != 0".
 bool FailsOnNull(const std::function<void()>& call);
 

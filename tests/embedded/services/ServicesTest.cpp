@@ -14,7 +14,7 @@
 #include "host/TOSSpecific.h"
 #include "host/TRootObject.h"
 #include "tests/embedded/services/TNamedProvider.h"
-#include "tests/embedded/value/StatusOf.h"
+#include "tests/support/StatusOf.h"
 #include "tests/support/TCapturingLogger.h"
 
 namespace NORVZEL20 {

@@ -4,8 +4,8 @@
 
 #include "embedded/value/TStubClass.h"
 #include "tests/embedded/value/DateTimeOf.h"
-#include "tests/embedded/value/StatusOf.h"
 #include "tests/embedded/value/ValuePrinter.h"
+#include "tests/support/StatusOf.h"
 
 namespace NORVZEL20 {
 namespace {

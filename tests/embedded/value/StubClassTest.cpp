@@ -5,7 +5,7 @@
 #include <boost/smart_ptr/make_shared.hpp>
 
 #include "host/ICIMNamespace.h"
-#include "tests/embedded/value/StatusOf.h"
+#include "tests/support/StatusOf.h"
 
 namespace NORVZEL20 {
 namespace {

@@ -7,8 +7,8 @@
 #include "embedded/value/TEmbeddedObject.h"
 #include "embedded/value/TValueAccess.h"
 #include "tests/embedded/value/DateTimeOf.h"
-#include "tests/embedded/value/StatusOf.h"
 #include "tests/embedded/value/ValuePrinter.h"
+#include "tests/support/StatusOf.h"
 
 namespace NORVZEL20 {
 namespace {
