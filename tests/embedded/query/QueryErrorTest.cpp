@@ -1,7 +1,7 @@
 #include "embedded/query/TQueryError.h"
 
 #include "embedded/query/TQuery.h"
-#include "tests/embedded/store/InMemFixture.h"
+#include "tests/embedded/store/TInMemFixture.h"
 
 namespace NORVZEL20 {
 namespace {
@@ -11,16 +11,16 @@ class QueryErrorTest : public TInMemFixture {
     QueryErrorTest()
     {
         DeclareDisk();
-        ns->FindClass("Disk")->AddPropertyDecl(Decl({"On", TType::kBoolean, {}}));
-        ns->FindClass("Disk")->AddPropertyDecl(Decl({"Since", TType::kDateTime, {}}));
-        ns->FindClass("Disk")->AddPropertyDecl(Decl({"Next", TType::kReference, {}}));
+        fNamespace->FindClass("Disk")->AddPropertyDecl(Decl({"On", TType::kBoolean, {}}));
+        fNamespace->FindClass("Disk")->AddPropertyDecl(Decl({"Since", TType::kDateTime, {}}));
+        fNamespace->FindClass("Disk")->AddPropertyDecl(Decl({"Next", TType::kReference, {}}));
     }
 
     /// `status: text`, or "no error".
     std::string ErrorOf(const std::string& query, const std::string& language = "WQL")
     {
         try {
-            TQuery(language, query).Execute(*ns, [](boost::shared_ptr<ICIMInstance>) { return true; });
+            TQuery(language, query).Execute(*fNamespace, [](boost::shared_ptr<ICIMInstance>) { return true; });
         } catch (const TQueryError& error) {
             return std::to_string(error.GetStatusCode().GetStatus()) + ": " + error.what();
         }

@@ -1,7 +1,7 @@
 #include "embedded/query/TQuery.h"
 
 #include "embedded/value/TEmbeddedObject.h"
-#include "tests/embedded/store/InMemFixture.h"
+#include "tests/embedded/store/TInMemFixture.h"
 #include "tests/embedded/value/DateTimeOf.h"
 
 namespace NORVZEL20 {
@@ -11,54 +11,54 @@ class QueryTest : public TInMemFixture {
   protected:
     QueryTest()
     {
-        device = Declare("Device", nullptr,
-                         {{"Id", TType::kString, {"Key"}},
-                          {"Big", TType::kUint64, {}},
-                          {"Small", TType::kSint8, {}},
-                          {"Share", TType::kReal64, {}},
-                          {"On", TType::kBoolean, {}},
-                          {"Since", TType::kDateTime, {}},
-                          {"Grade", TType::kChar16, {}},
-                          {"Next", TType::kReference, {}},
-                          {"Part", TType::kString, {}},
-                          {"Tags", TType::kArrayString, {}}});
-        disk = Declare("Disk", device, {{"Label", TType::kString, {}}});
-        Add(device, {{"Id", "cpu"},
-                     {"Big", TCIMValue(~static_cast<std::uint64_t>(0))},
-                     {"Small", TCIMValue(static_cast<signed char>(-5))},
-                     {"Share", TCIMValue(0.5)},
-                     {"On", TCIMValue(true)},
-                     {"Grade", TCIMValue(u'b')}});
-        const auto fan = Add(device, {{"Id", "fan"},
-                                      {"Big", TCIMValue(static_cast<std::uint64_t>(3))},
-                                      {"On", TCIMValue(false)},
-                                      {"Since", TCIMValue(DateTimeOf("20200102030405.000000+060"))}});
-        Add(disk, {{"Id", "sda"},
-                   {"Label", "a\"b'c\\d"},
-                   {"Big", TCIMValue(static_cast<std::uint64_t>(3))},
-                   {"Share", TCIMValue(3.0)},
-                   {"Next", TCIMValue(fan->GetReference())},
-                   {"Tags", Texts({"x"})},
-                   {"Since", TCIMValue(DateTimeOf("2020010203****.******+060"))}});
-        Add(disk, {{"Id", "sdb"}, {"Part", TCIMValue(boost::make_shared<const TEmbeddedObject>("Disk"))}});
+        fDevice = Declare("Device", nullptr,
+                          {{"Id", TType::kString, {"Key"}},
+                           {"Big", TType::kUint64, {}},
+                           {"Small", TType::kSint8, {}},
+                           {"Share", TType::kReal64, {}},
+                           {"On", TType::kBoolean, {}},
+                           {"Since", TType::kDateTime, {}},
+                           {"Grade", TType::kChar16, {}},
+                           {"Next", TType::kReference, {}},
+                           {"Part", TType::kString, {}},
+                           {"Tags", TType::kArrayString, {}}});
+        fDisk = Declare("Disk", fDevice, {{"Label", TType::kString, {}}});
+        Add(fDevice, {{"Id", "cpu"},
+                      {"Big", TCIMValue(~static_cast<std::uint64_t>(0))},
+                      {"Small", TCIMValue(static_cast<signed char>(-5))},
+                      {"Share", TCIMValue(0.5)},
+                      {"On", TCIMValue(true)},
+                      {"Grade", TCIMValue(u'b')}});
+        const auto fan = Add(fDevice, {{"Id", "fan"},
+                                       {"Big", TCIMValue(static_cast<std::uint64_t>(3))},
+                                       {"On", TCIMValue(false)},
+                                       {"Since", TCIMValue(DateTimeOf("20200102030405.000000+060"))}});
+        Add(fDisk, {{"Id", "sda"},
+                    {"Label", "a\"b'c\\d"},
+                    {"Big", TCIMValue(static_cast<std::uint64_t>(3))},
+                    {"Share", TCIMValue(3.0)},
+                    {"Next", TCIMValue(fan->GetReference())},
+                    {"Tags", Texts({"x"})},
+                    {"Since", TCIMValue(DateTimeOf("2020010203****.******+060"))}});
+        Add(fDisk, {{"Id", "sdb"}, {"Part", TCIMValue(boost::make_shared<const TEmbeddedObject>("Disk"))}});
     }
 
     /// The ids of the answers, with blanks between.
     std::string Answer(std::string query, std::string language = "WQL")
     {
         std::string ids;
-        ns->ExecuteQuery(
+        fNamespace->ExecuteQuery(
             [&](boost::shared_ptr<ICIMInstance> instance) {
-                ids += (ids.empty() ? "" : " ") + instance->GetProperty("Id", none)->GetValue(none).ToText();
+                ids += (ids.empty() ? "" : " ") + instance->GetProperty("Id", kNone)->GetValue(kNone).ToText();
                 return true;
             },
-            language, query, none);
+            language, query, kNone);
         return ids;
     }
 
     std::string Where(const std::string& condition) { return Answer("SELECT * FROM Device WHERE " + condition); }
 
-    TClassPointer device, disk;
+    TClassPointer fDevice, fDisk;
 };
 
 TEST_F(QueryTest, CoversTheClassAndAllBelow)
@@ -74,7 +74,7 @@ TEST_F(QueryTest, CoversTheClassAndAllBelow)
 TEST_F(QueryTest, StopsWhenTheCallbackReturnsFalse)
 {
     int answers = 0;
-    TQuery("WQL", "SELECT * FROM Device").Execute(*ns, [&](boost::shared_ptr<ICIMInstance>) { return ++answers < 3; });
+    TQuery("WQL", "SELECT * FROM Device").Execute(*fNamespace, [&](boost::shared_ptr<ICIMInstance>) { return ++answers < 3; });
     EXPECT_EQ(3, answers);
 }
 
@@ -166,8 +166,8 @@ TEST_F(QueryTest, ALongConditionIsNotADeepOne)
 TEST_F(QueryTest, AnInstanceAddedByTheCallbackIsNoAnswer)
 {
     int answers = 0;
-    TQuery("WQL", "SELECT * FROM Disk").Execute(*ns, [&](boost::shared_ptr<ICIMInstance>) {
-        Add(disk, {{"Id", TCIMValue("new" + std::to_string(answers))}});
+    TQuery("WQL", "SELECT * FROM Disk").Execute(*fNamespace, [&](boost::shared_ptr<ICIMInstance>) {
+        Add(fDisk, {{"Id", TCIMValue("new" + std::to_string(answers))}});
         return ++answers > 0;
     });
     EXPECT_EQ(2, answers);

@@ -6,55 +6,55 @@
 namespace NORVZEL20 {
 namespace {
 
-// An enumeration, how many elements it has, and how to run it with a callback that asks `goOn` for its answer.
+// An enumeration: its size, and how to run it with a callback that returns what `goOn` returns.
 struct TEnumeration {
     const char* name;
     std::size_t size;
     std::function<void(const std::function<bool()>& goOn)> run;
 };
 
-// For any type of element.
+// A callback for elements of any type.
 auto Ask(const std::function<bool()>& goOn)
 {
     return [&goOn](const auto&) { return goOn(); };
 }
 
-// The devices with two instances of each class, and of everything else that can be enumerated at least three.
+// The devices with two instances of each class, and at least three of everything else that can be enumerated.
 class EnumerationTest : public TDevicesFixture {
   protected:
     EnumerationTest()
     {
         DeclareMembers();
         for (const char* const name : {"Units", "Version", "Key"}) {
-            ns->AllocateQualifierDecl(name, TCIMValue(false), ICIMQualifierDecl::kScopeAny, ICIMQualifierDecl::kFlavorDefault,
-                                      none);
+            fNamespace->AllocateQualifierDecl(name, TCIMValue(false), ICIMQualifierDecl::kScopeAny,
+                                              ICIMQualifierDecl::kFlavorDefault, kNone);
         }
-        cabinet =
+        fCabinet =
             Declare("Cabinet", nullptr,
                     {{"Row", TType::kUint32, {"Key"}}, {"Place", TType::kUint32, {"Key"}}, {"Side", TType::kString, {"Key"}}});
         Associate("Location", "Room");
         Associate("Cooling", "Fan");
         Associate("Mounting", "Cabinet");
-        for (const TClassPointer& cls : {device, disk, solidState, fan}) {
-            Add(cls, {{"Id", cls->GetName(none) + "1"}});
-            Add(cls, {{"Id", cls->GetName(none) + "2"}});
+        for (const TClassPointer& cls : {fDevice, fDisk, fSolidState, fFan}) {
+            Add(cls, {{"Id", cls->GetName(kNone) + "1"}});
+            Add(cls, {{"Id", cls->GetName(kNone) + "2"}});
         }
-        mounted = Add(cabinet, {{"Row", TCIMValue(3U)}, {"Place", TCIMValue(4U)}, {"Side", "front"}});
+        fMounted = Add(fCabinet, {{"Row", TCIMValue(3U)}, {"Place", TCIMValue(4U)}, {"Side", "front"}});
     }
 
     void DeclareMembers()
     {
         for (const char* const name : {"Count", "Limit"}) {
-            device->AddPropertyDecl(Decl({name, TType::kUint32, {"Static"}}));
+            fDevice->AddPropertyDecl(Decl({name, TType::kUint32, {"Static"}}));
         }
-        disk->AddPropertyDecl(Decl({"Spare", TType::kUint32, {"Static"}}));
-        device->AddMethodDecl(device->AllocateMethodDecl("Start", TType::kUint32, none));
-        device->AddMethodDecl(device->AllocateMethodDecl("Stop", TType::kUint32, none));
-        disk->AddMethodDecl(disk->AllocateMethodDecl("Format", TType::kUint32, none));
-        device->AddQualifier(Qualifier("Version"));
-        device->AddQualifier(Qualifier("Units"));
-        disk->AddQualifier(Qualifier("Revised"));
-        disk->AddQualifier(Qualifier("Deprecated"));
+        fDisk->AddPropertyDecl(Decl({"Spare", TType::kUint32, {"Static"}}));
+        fDevice->AddMethodDecl(fDevice->AllocateMethodDecl("Start", TType::kUint32, kNone));
+        fDevice->AddMethodDecl(fDevice->AllocateMethodDecl("Stop", TType::kUint32, kNone));
+        fDisk->AddMethodDecl(fDisk->AllocateMethodDecl("Format", TType::kUint32, kNone));
+        fDevice->AddQualifier(Qualifier("Version"));
+        fDevice->AddQualifier(Qualifier("Units"));
+        fDisk->AddQualifier(Qualifier("Revised"));
+        fDisk->AddQualifier(Qualifier("Deprecated"));
     }
 
     void Associate(const std::string& name, const std::string& className)
@@ -63,54 +63,54 @@ class EnumerationTest : public TDevicesFixture {
         association->AddQualifier(Qualifier("Association"));
         association->AddPropertyDecl(Reference("Thing", "Device"));
         association->AddPropertyDecl(Reference("Other", className));
-        association->AddToNamespace(none);
+        association->AddToNamespace(kNone);
     }
 
     std::vector<TEnumeration> OfTheNamespace()
     {
         return {
-            {"root classes", 6, [&](auto& goOn) { ns->EnumerateRootClasses(Ask(goOn), none); }},
-            {"qualifier declarations", 3, [&](auto& goOn) { ns->EnumerateQualifierDecls(Ask(goOn), none); }},
+            {"root classes", 6, [&](auto& goOn) { fNamespace->EnumerateRootClasses(Ask(goOn), kNone); }},
+            {"qualifier declarations", 3, [&](auto& goOn) { fNamespace->EnumerateQualifierDecls(Ask(goOn), kNone); }},
             {"answers of a query", 8, [&](auto& goOn) { Query("SELECT * FROM Device", goOn); }},
             {"answers of a query with a condition", 4, [&](auto& goOn) { Query("SELECT * FROM Device WHERE Id LIKE '%2'", goOn); }},
-            {"classes below the pseudo-class", 6, [&](auto& goOn) { Root()->EnumerateSubClasses(Ask(goOn), false, none); }},
-            {"all classes", 9, [&](auto& goOn) { Root()->EnumerateSubClasses(Ask(goOn), true, none); }},
-            {"all instances", 9, [&](auto& goOn) { Root()->EnumerateInstances(Ask(goOn), true, none); }},
+            {"classes below the pseudo-class", 6, [&](auto& goOn) { Root()->EnumerateSubClasses(Ask(goOn), false, kNone); }},
+            {"all classes", 9, [&](auto& goOn) { Root()->EnumerateSubClasses(Ask(goOn), true, kNone); }},
+            {"all instances", 9, [&](auto& goOn) { Root()->EnumerateInstances(Ask(goOn), true, kNone); }},
         };
     }
 
     std::vector<TEnumeration> OfAClass()
     {
         return {
-            {"subclasses", 3, [&](auto& goOn) { device->EnumerateSubClasses(Ask(goOn), true, none); }},
-            {"associated classes", 3, [&](auto& goOn) { device->EnumerateAssociatedClasses(Ask(goOn), "", "", "", "", none); }},
-            {"association classes", 3, [&](auto& goOn) { device->EnumerateAssociationClasses(Ask(goOn), "", "", none); }},
-            {"key names", 3, [&](auto& goOn) { cabinet->EnumerateKeyNames(Ask(goOn), none); }},
-            {"property declarations", 6, [&](auto& goOn) { solidState->EnumeratePropertyDecls(Ask(goOn), none); }},
-            {"static properties", 3, [&](auto& goOn) { solidState->EnumerateStaticProperties(Ask(goOn), none); }},
-            {"instances", 2, [&](auto& goOn) { device->EnumerateInstances(Ask(goOn), false, none); }},
-            {"instances of subclasses too", 8, [&](auto& goOn) { device->EnumerateInstances(Ask(goOn), true, none); }},
-            {"method declarations", 3, [&](auto& goOn) { solidState->EnumerateMethodDecls(Ask(goOn), none); }},
-            {"qualifiers, inherited ones too", 4, [&](auto& goOn) { disk->EnumerateQualifiers(Ask(goOn), none); }},
+            {"subclasses", 3, [&](auto& goOn) { fDevice->EnumerateSubClasses(Ask(goOn), true, kNone); }},
+            {"associated classes", 3, [&](auto& goOn) { fDevice->EnumerateAssociatedClasses(Ask(goOn), "", "", "", "", kNone); }},
+            {"association classes", 3, [&](auto& goOn) { fDevice->EnumerateAssociationClasses(Ask(goOn), "", "", kNone); }},
+            {"key names", 3, [&](auto& goOn) { fCabinet->EnumerateKeyNames(Ask(goOn), kNone); }},
+            {"property declarations", 6, [&](auto& goOn) { fSolidState->EnumeratePropertyDecls(Ask(goOn), kNone); }},
+            {"static properties", 3, [&](auto& goOn) { fSolidState->EnumerateStaticProperties(Ask(goOn), kNone); }},
+            {"instances", 2, [&](auto& goOn) { fDevice->EnumerateInstances(Ask(goOn), false, kNone); }},
+            {"instances of subclasses too", 8, [&](auto& goOn) { fDevice->EnumerateInstances(Ask(goOn), true, kNone); }},
+            {"method declarations", 3, [&](auto& goOn) { fSolidState->EnumerateMethodDecls(Ask(goOn), kNone); }},
+            {"qualifiers, inherited ones too", 4, [&](auto& goOn) { fDisk->EnumerateQualifiers(Ask(goOn), kNone); }},
         };
     }
 
     std::vector<TEnumeration> OfAnInstance()
     {
         return {
-            {"properties", 3, [&](auto& goOn) { mounted->EnumerateProperties(Ask(goOn), none); }},
-            {"key bindings", 3, [&](auto& goOn) { mounted->GetReference(none).EnumerateKeyBindings(Ask(goOn)); }},
+            {"properties", 3, [&](auto& goOn) { fMounted->EnumerateProperties(Ask(goOn), kNone); }},
+            {"key bindings", 3, [&](auto& goOn) { fMounted->GetReference(kNone).EnumerateKeyBindings(Ask(goOn)); }},
         };
     }
 
     void Query(std::string query, const std::function<bool()>& goOn)
     {
         std::string language = "WQL";
-        ns->ExecuteQuery(Ask(goOn), language, query, none);
+        fNamespace->ExecuteQuery(Ask(goOn), language, query, kNone);
     }
 
-    // Every enumeration with a callback that ends it at each of its elements in turn, and at none.
-    static void ExpectToStopAtOnce(const std::vector<TEnumeration>& enumerations)
+    // Runs each enumeration several times: once ended at each of its elements, and once to its end.
+    static void ExpectToEndAtEachElement(const std::vector<TEnumeration>& enumerations)
     {
         for (const TEnumeration& each : enumerations) {
             for (std::size_t last = 1; last <= each.size + 1; ++last) {
@@ -121,23 +121,23 @@ class EnumerationTest : public TDevicesFixture {
         }
     }
 
-    TClassPointer cabinet;
-    TInstancePointer mounted;
+    TClassPointer fCabinet;
+    TInstancePointer fMounted;
 };
 
-TEST_F(EnumerationTest, OfANamespaceEndsWhereTheCallbackSaysSo)
+TEST_F(EnumerationTest, OfANamespaceEndsWhenTheCallbackReturnsFalse)
 {
-    ExpectToStopAtOnce(OfTheNamespace());
+    ExpectToEndAtEachElement(OfTheNamespace());
 }
 
-TEST_F(EnumerationTest, OfAClassEndsWhereTheCallbackSaysSo)
+TEST_F(EnumerationTest, OfAClassEndsWhenTheCallbackReturnsFalse)
 {
-    ExpectToStopAtOnce(OfAClass());
+    ExpectToEndAtEachElement(OfAClass());
 }
 
-TEST_F(EnumerationTest, OfAnInstanceEndsWhereTheCallbackSaysSo)
+TEST_F(EnumerationTest, OfAnInstanceEndsWhenTheCallbackReturnsFalse)
 {
-    ExpectToStopAtOnce(OfAnInstance());
+    ExpectToEndAtEachElement(OfAnInstance());
 }
 
 }  // namespace

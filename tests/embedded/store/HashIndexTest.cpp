@@ -8,13 +8,13 @@
 namespace NORVZEL20 {
 namespace {
 
-TEST(HashIndexTest, FindsNothingWhereNothingIs)
+TEST(HashIndexTest, AnEmptyIndexFindsNothing)
 {
     const THashIndex index;
     EXPECT_EQ(THashIndex::kNone, index.Find(0, [](std::uint32_t) { return true; }));
 }
 
-TEST(HashIndexTest, OrdinalsOfOneHashAreToldApartByTheCaller)
+TEST(HashIndexTest, TheCallerChoosesAmongOrdinalsOfOneHash)
 {
     THashIndex index;
     index.Add(7, 1);
@@ -34,17 +34,17 @@ TEST(HashIndexTest, AgreesWithAMapOverRandomChanges)
     THashIndex index;
     std::map<std::uint32_t, std::uint32_t> hashes;  // by ordinal
     for (std::uint32_t step = 0; step < 50000; ++step) {
-        const std::uint32_t ordinal = std::uint32_t(random() % 700);
+        const std::uint32_t ordinal = static_cast<std::uint32_t>(random() % 700);
         const auto at = hashes.find(ordinal);
         if (at == hashes.end()) {
-            const std::uint32_t hash = std::uint32_t(random() % 300) << (random() % 3 * 8);
+            const std::uint32_t hash = static_cast<std::uint32_t>(random() % 300) << (random() % 3 * 8);
             index.Add(hash, ordinal);
             hashes[ordinal] = hash;
         } else {
             index.Remove(at->second, ordinal);
             hashes.erase(at);
         }
-        const std::uint32_t wanted = std::uint32_t(random() % 700);
+        const std::uint32_t wanted = static_cast<std::uint32_t>(random() % 700);
         const auto expected = hashes.find(wanted);
         const std::uint32_t hash = expected == hashes.end() ? 0 : expected->second;
         ASSERT_EQ(expected == hashes.end() ? THashIndex::kNone : wanted,

@@ -7,261 +7,261 @@ using InMemClassChangeTest = TDevicesFixture;
 
 TEST_F(InMemClassChangeTest, APropertyThatComesLateReachesAllBelow)
 {
-    EXPECT_TRUE(device->AddPropertyDecl(Decl({"Serial", TType::kString, {"Key"}})));
-    EXPECT_EQ("Id Serial Size Wear", PropertiesOf(*solidState));
-    EXPECT_EQ("Id Serial", KeysOf(*solidState));
-    EXPECT_EQ("Id Serial", PropertiesOf(*device));
+    EXPECT_TRUE(fDevice->AddPropertyDecl(Decl({"Serial", TType::kString, {"Key"}})));
+    EXPECT_EQ("Id Serial Size Wear", PropertiesOf(*fSolidState));
+    EXPECT_EQ("Id Serial", KeysOf(*fSolidState));
+    EXPECT_EQ("Id Serial", PropertiesOf(*fDevice));
 }
 
 TEST_F(InMemClassChangeTest, PropertiesThatComeLateComeInTheOrderOfThoseThatComeEarly)
 {
-    const auto tape = Declare("Tape", fan, {{"Serial", TType::kString, {}}, {"Length", TType::kUint32, {}}});
+    const auto tape = Declare("Tape", fFan, {{"Serial", TType::kString, {}}, {"Length", TType::kUint32, {}}});
     const auto reel = Declare("Reel", tape, {{"Width", TType::kUint8, {}}});
-    disk->AddPropertyDecl(Decl({"Blocks", TType::kUint64, {}}));
-    device->AddPropertyDecl(Decl({"Serial", TType::kString, {}}));
-    device->AddPropertyDecl(Decl({"Weight", TType::kUint32, {"Key"}}));
-    fan->AddPropertyDecl(Decl({"Blades", TType::kUint8, {}}));
+    fDisk->AddPropertyDecl(Decl({"Blocks", TType::kUint64, {}}));
+    fDevice->AddPropertyDecl(Decl({"Serial", TType::kString, {}}));
+    fDevice->AddPropertyDecl(Decl({"Weight", TType::kUint32, {"Key"}}));
+    fFan->AddPropertyDecl(Decl({"Blades", TType::kUint8, {}}));
     EXPECT_EQ("Id Serial Weight Speed Blades Length Width", PropertiesOf(*reel));
-    EXPECT_EQ("Id Serial Weight Size Blocks Wear", PropertiesOf(*solidState));
+    EXPECT_EQ("Id Serial Weight Size Blocks Wear", PropertiesOf(*fSolidState));
     EXPECT_EQ("Id Weight", KeysOf(*reel));
-    EXPECT_EQ("Id Weight", KeysOf(*solidState));
-    EXPECT_EQ(tape, boost::dynamic_pointer_cast<TInMemPropertyDecl>(reel->GetPropertyDecl("Serial", none))->GetOwner());
+    EXPECT_EQ("Id Weight", KeysOf(*fSolidState));
+    EXPECT_EQ(tape, boost::dynamic_pointer_cast<TInMemPropertyDecl>(reel->GetPropertyDecl("Serial", kNone))->GetOwner());
     EXPECT_EQ("Id=r1 Serial=NULL Weight=NULL Speed=NULL Blades=NULL Length=NULL Width=7",
-              ValuesOf(*Allocate(reel, {{"Id", "r1"}, {"Width", TCIMValue(std::uint8_t(7))}})));
+              ValuesOf(*Allocate(reel, {{"Id", "r1"}, {"Width", TCIMValue(static_cast<std::uint8_t>(7))}})));
 }
 
 TEST_F(InMemClassChangeTest, ASubclassThatIsDeclaredLateHasWhatItsSuperclassGotMeanwhile)
 {
-    const auto tape = Allocate("Tape", device, {{"Length", TType::kUint32, {}}});
-    device->AddPropertyDecl(Decl({"Serial", TType::kString, {}}));
-    tape->AddToNamespace(none);
+    const auto tape = Allocate("Tape", fDevice, {{"Length", TType::kUint32, {}}});
+    fDevice->AddPropertyDecl(Decl({"Serial", TType::kString, {}}));
+    tape->AddToNamespace(kNone);
     EXPECT_EQ("Id Serial Length", PropertiesOf(*tape));
 }
 
 TEST_F(InMemClassChangeTest, AnOverrideKeepsItsPlaceAndInheritsTheKey)
 {
-    const auto tape = Allocate("Tape", device, {{"Length", TType::kUint32, {}}, {"ID", TType::kString, {"Upper"}}});
-    tape->AddToNamespace(none);
+    const auto tape = Allocate("Tape", fDevice, {{"Length", TType::kUint32, {}}, {"ID", TType::kString, {"Upper"}}});
+    tape->AddToNamespace(kNone);
     EXPECT_EQ("ID Length", PropertiesOf(*tape));
     EXPECT_EQ("ID", KeysOf(*tape));
-    EXPECT_EQ("Upper Key", QualifiersOf(*tape->GetPropertyDecl("id", none)));
-    EXPECT_EQ("Key", QualifiersOf(*device->GetPropertyDecl("id", none)));
+    EXPECT_EQ("Upper Key", QualifiersOf(*tape->GetPropertyDecl("id", kNone)));
+    EXPECT_EQ("Key", QualifiersOf(*fDevice->GetPropertyDecl("id", kNone)));
 }
 
 TEST_F(InMemClassChangeTest, AnOverrideOfAnotherTypeIsRefusedFromAboveAndBelow)
 {
-    EXPECT_EQ(13, StatusOf([&] { disk->AddPropertyDecl(Decl({"Id", TType::kUint32, {}})); }));
-    EXPECT_EQ(13, StatusOf([&] { device->AddPropertyDecl(Decl({"wear", TType::kString, {}})); }));
-    EXPECT_EQ("Id", PropertiesOf(*device));
-    EXPECT_EQ("Id Size", PropertiesOf(*disk));
+    EXPECT_EQ(TZELStatusCode::kTypeMismatch, StatusOf([&] { fDisk->AddPropertyDecl(Decl({"Id", TType::kUint32, {}})); }));
+    EXPECT_EQ(TZELStatusCode::kTypeMismatch, StatusOf([&] { fDevice->AddPropertyDecl(Decl({"wear", TType::kString, {}})); }));
+    EXPECT_EQ("Id", PropertiesOf(*fDevice));
+    EXPECT_EQ("Id Size", PropertiesOf(*fDisk));
 }
 
 TEST_F(InMemClassChangeTest, ASuperclassThatGotAnotherTypeMeanwhileKeepsAClassOut)
 {
-    const auto tape = Allocate("Tape", device, {{"Length", TType::kUint32, {}}});
-    device->AddPropertyDecl(Decl({"Length", TType::kUint64, {}}));
-    EXPECT_EQ(13, StatusOf([&] { tape->Validate(none); }));
-    EXPECT_EQ(13, StatusOf([&] { tape->AddToNamespace(none); }));
-    EXPECT_EQ("Disk Fan", SubClassesOf(*device, false));
+    const auto tape = Allocate("Tape", fDevice, {{"Length", TType::kUint32, {}}});
+    fDevice->AddPropertyDecl(Decl({"Length", TType::kUint64, {}}));
+    EXPECT_EQ(TZELStatusCode::kTypeMismatch, StatusOf([&] { tape->Validate(kNone); }));
+    EXPECT_EQ(TZELStatusCode::kTypeMismatch, StatusOf([&] { tape->AddToNamespace(kNone); }));
+    EXPECT_EQ("Disk Fan", SubClassesOf(*fDevice, false));
 }
 
 TEST_F(InMemClassChangeTest, ADeclarationBelongsToOneClassAndStandsThereOnce)
 {
     const auto decl = Decl({"Serial", TType::kString, {}});
-    EXPECT_TRUE(disk->AddPropertyDecl(decl));
-    EXPECT_FALSE(disk->AddPropertyDecl(Decl({"SERIAL", TType::kString, {}})));
-    EXPECT_EQ(5, StatusOf([&] { fan->AddPropertyDecl(decl); }));
-    EXPECT_EQ(5, StatusOf([&] { fan->AddPropertyDecl(nullptr); }));
+    EXPECT_TRUE(fDisk->AddPropertyDecl(decl));
+    EXPECT_FALSE(fDisk->AddPropertyDecl(Decl({"SERIAL", TType::kString, {}})));
+    EXPECT_EQ(TZELStatusCode::kInvalidParameter, StatusOf([&] { fFan->AddPropertyDecl(decl); }));
+    EXPECT_EQ(TZELStatusCode::kInvalidParameter, StatusOf([&] { fFan->AddPropertyDecl(nullptr); }));
 }
 
 TEST_F(InMemClassChangeTest, ARemovedPropertyGoesFromAllBelowAndMayComeBack)
 {
-    const auto size = disk->GetPropertyDecl("Size", none);
-    const auto instance = Add(solidState, {{"Id", "sda"}, {"Size", TCIMValue(std::uint64_t(5))}});
-    EXPECT_FALSE(solidState->RemovePropertyDecl(size));
-    EXPECT_TRUE(disk->RemovePropertyDecl(size));
-    EXPECT_FALSE(disk->RemovePropertyDecl(size));
-    EXPECT_EQ("Id Wear", PropertiesOf(*solidState));
+    const auto size = fDisk->GetPropertyDecl("Size", kNone);
+    const auto instance = Add(fSolidState, {{"Id", "sda"}, {"Size", Uint64(5)}});
+    EXPECT_FALSE(fSolidState->RemovePropertyDecl(size));
+    EXPECT_TRUE(fDisk->RemovePropertyDecl(size));
+    EXPECT_FALSE(fDisk->RemovePropertyDecl(size));
+    EXPECT_EQ("Id Wear", PropertiesOf(*fSolidState));
     EXPECT_EQ("Id=sda Wear=NULL", ValuesOf(*instance));
-    EXPECT_EQ(15, StatusOf([&] { instance->GetProperty("Size", none); }));
-    EXPECT_TRUE(disk->AddPropertyDecl(Decl({"Size", TType::kString, {}})));
+    EXPECT_EQ(TZELStatusCode::kNotFound, StatusOf([&] { instance->GetProperty("Size", kNone); }));
+    EXPECT_TRUE(fDisk->AddPropertyDecl(Decl({"Size", TType::kString, {}})));
     EXPECT_EQ("Id=sda Size=NULL Wear=NULL", ValuesOf(*instance));
 }
 
 TEST_F(InMemClassChangeTest, RemovingAnOverrideBringsBackWhatItOverrode)
 {
     const auto own = Decl({"Id", TType::kString, {"Upper"}});
-    disk->AddPropertyDecl(own);
-    EXPECT_EQ("Upper Key", QualifiersOf(*solidState->GetPropertyDecl("Id", none)));
-    Add(disk, {{"Id", "sda"}});
-    EXPECT_TRUE(disk->RemovePropertyDecl(own));
-    EXPECT_EQ("Key", QualifiersOf(*solidState->GetPropertyDecl("Id", none)));
+    fDisk->AddPropertyDecl(own);
+    EXPECT_EQ("Upper Key", QualifiersOf(*fSolidState->GetPropertyDecl("Id", kNone)));
+    Add(fDisk, {{"Id", "sda"}});
+    EXPECT_TRUE(fDisk->RemovePropertyDecl(own));
+    EXPECT_EQ("Key", QualifiersOf(*fSolidState->GetPropertyDecl("Id", kNone)));
 }
 
 TEST_F(InMemClassChangeTest, AKeyOfAClassWithInstancesStays)
 {
-    const auto key = device->GetPropertyDecl("Id", none);
-    Add(fan, {{"Id", "fan0"}});
-    EXPECT_EQ(19, StatusOf([&] { device->RemovePropertyDecl(key); }));
-    EXPECT_EQ("Id", KeysOf(*fan));
+    const auto key = fDevice->GetPropertyDecl("Id", kNone);
+    Add(fFan, {{"Id", "fan0"}});
+    EXPECT_EQ(TZELStatusCode::kClassInUse, StatusOf([&] { fDevice->RemovePropertyDecl(key); }));
+    EXPECT_EQ("Id", KeysOf(*fFan));
 }
 
-/// Two instances would have one path.
+// Without the key, the two instances would have the same path.
 TEST_F(InMemClassChangeTest, AKeyThatAnOverrideMadeStaysWhileThereAreInstances)
 {
     const auto label = Decl({"Label", TType::kString, {}});
     const auto own = Decl({"Label", TType::kString, {"Key"}});
-    device->AddPropertyDecl(label);
-    disk->AddPropertyDecl(own);
-    Add(solidState, {{"Id", "sda"}, {"Label", "one"}});
-    Add(solidState, {{"Id", "sda"}, {"Label", "two"}});
-    EXPECT_EQ(19, StatusOf([&] { disk->RemovePropertyDecl(own); }));
-    EXPECT_EQ("Id Label", KeysOf(*solidState));
-    ns->ClearInstances();
-    Add(fan, {{"Id", "fan0"}, {"Label", "none of its keys"}});
-    EXPECT_TRUE(disk->RemovePropertyDecl(own));
-    EXPECT_EQ("Id", KeysOf(*solidState));
+    fDevice->AddPropertyDecl(label);
+    fDisk->AddPropertyDecl(own);
+    Add(fSolidState, {{"Id", "sda"}, {"Label", "one"}});
+    Add(fSolidState, {{"Id", "sda"}, {"Label", "two"}});
+    EXPECT_EQ(TZELStatusCode::kClassInUse, StatusOf([&] { fDisk->RemovePropertyDecl(own); }));
+    EXPECT_EQ("Id Label", KeysOf(*fSolidState));
+    fNamespace->ClearInstances();
+    Add(fFan, {{"Id", "fan0"}, {"Label", "none of its keys"}});
+    EXPECT_TRUE(fDisk->RemovePropertyDecl(own));
+    EXPECT_EQ("Id", KeysOf(*fSolidState));
 }
 
 TEST_F(InMemClassChangeTest, AnOverrideThatRepeatsTheKeyMayGo)
 {
     const auto own = Decl({"Id", TType::kString, {"Key"}});
-    disk->AddPropertyDecl(own);
-    Add(disk, {{"Id", "sda"}});
-    EXPECT_EQ(0, StatusOf([&] { own->AddQualifier(Qualifier("Key", TCIMValue(false)), none); }));
-    EXPECT_TRUE(disk->RemovePropertyDecl(own));
-    EXPECT_EQ("Id", KeysOf(*disk));
+    fDisk->AddPropertyDecl(own);
+    Add(fDisk, {{"Id", "sda"}});
+    EXPECT_EQ(TZELStatusCode::kSuccess, StatusOf([&] { own->AddQualifier(Qualifier("Key", TCIMValue(false)), kNone); }));
+    EXPECT_TRUE(fDisk->RemovePropertyDecl(own));
+    EXPECT_EQ("Id", KeysOf(*fDisk));
 }
 
-TEST_F(InMemClassChangeTest, AKeyIsNotUnsaidWhileThereAreInstances)
+TEST_F(InMemClassChangeTest, AKeyCannotBeRevokedWhileThereAreInstances)
 {
-    const auto id = device->GetPropertyDecl("Id", none);
-    Add(fan, {{"Id", "fan0"}});
-    EXPECT_EQ(19, StatusOf([&] { id->AddQualifier(Qualifier("KEY", TCIMValue(false)), none); }));
-    EXPECT_EQ("Id", KeysOf(*fan));
+    const auto id = fDevice->GetPropertyDecl("Id", kNone);
+    Add(fFan, {{"Id", "fan0"}});
+    EXPECT_EQ(TZELStatusCode::kClassInUse, StatusOf([&] { id->AddQualifier(Qualifier("KEY", TCIMValue(false)), kNone); }));
+    EXPECT_EQ("Id", KeysOf(*fFan));
     EXPECT_EQ("Key", QualifiersOf(*id));
-    EXPECT_EQ(0, StatusOf([&] { id->AddQualifier(Qualifier("Key"), none); }));
-    ns->ClearInstances();
-    EXPECT_EQ(0, StatusOf([&] { id->AddQualifier(Qualifier("Key", TCIMValue(false)), none); }));
-    EXPECT_EQ("", KeysOf(*fan));
+    EXPECT_EQ(TZELStatusCode::kSuccess, StatusOf([&] { id->AddQualifier(Qualifier("Key"), kNone); }));
+    fNamespace->ClearInstances();
+    EXPECT_EQ(TZELStatusCode::kSuccess, StatusOf([&] { id->AddQualifier(Qualifier("Key", TCIMValue(false)), kNone); }));
+    EXPECT_EQ("", KeysOf(*fFan));
 }
 
 TEST_F(InMemClassChangeTest, AKeyThatComesLateLeavesInstancesToBeFound)
 {
-    const auto instance = Add(room, {{"Name", "hall"}});
-    room->AddPropertyDecl(Decl({"Floor", TType::kUint8, {"Key"}}));
+    const auto instance = Add(fRoom, {{"Name", "hall"}});
+    fRoom->AddPropertyDecl(Decl({"Floor", TType::kUint8, {"Key"}}));
     EXPECT_EQ("root/cimv2:Room.Floor=NULL,Name=\"hall\"", instance->GetReference().GetPath());
-    EXPECT_EQ(instance, ns->GetInstance(instance->GetReference(), none));
-    EXPECT_EQ(14, StatusOf([&] { ns->GetInstance(Path("Room.Name=\"hall\""), none); }));
+    EXPECT_EQ(instance, fNamespace->GetInstance(instance->GetReference(), kNone));
+    EXPECT_EQ(TZELStatusCode::kKeyMissing, StatusOf([&] { fNamespace->GetInstance(Path("Room.Name=\"hall\""), kNone); }));
 }
 
 TEST_F(InMemClassChangeTest, AQualifierThatComesLateCountsAtOnce)
 {
-    disk->GetPropertyDecl("Size", none)->AddQualifier(Qualifier("Key"), none);
-    EXPECT_EQ("Id Size", KeysOf(*solidState));
+    fDisk->GetPropertyDecl("Size", kNone)->AddQualifier(Qualifier("Key"), kNone);
+    EXPECT_EQ("Id Size", KeysOf(*fSolidState));
 }
 
 TEST_F(InMemClassChangeTest, APropertyThatBecomesAKeyLeavesInstancesOfSubclassesToBeFound)
 {
-    const auto instance = Add(solidState, {{"Id", "sda"}, {"Size", TCIMValue(std::uint64_t(7))}});
-    disk->GetPropertyDecl("Size", none)->AddQualifier(Qualifier("Key"), none);
-    EXPECT_EQ(instance, ns->GetInstance(Path("SolidState.Id=\"sda\",Size=7"), none));
-    EXPECT_EQ(15, StatusOf([&] { ns->GetInstance(Path("SolidState.Id=\"sda\",Size=8"), none); }));
-    EXPECT_EQ(12, StatusOf([&] { Add(solidState, {{"Id", "sda"}, {"Size", TCIMValue(std::uint64_t(7))}}); }));
-    Add(solidState, {{"Id", "sda"}, {"Size", TCIMValue(std::uint64_t(8))}});
-    ns->DeleteInstance(Path("SolidState.Id=\"sda\",Size=7"), none);
-    EXPECT_EQ("SolidState.Id=\"sda\",Size=8\n", InstancesOf(*solidState));
+    const auto instance = Add(fSolidState, {{"Id", "sda"}, {"Size", Uint64(7)}});
+    fDisk->GetPropertyDecl("Size", kNone)->AddQualifier(Qualifier("Key"), kNone);
+    EXPECT_EQ(instance, fNamespace->GetInstance(Path("SolidState.Id=\"sda\",Size=7"), kNone));
+    EXPECT_EQ(TZELStatusCode::kNotFound, StatusOf([&] { fNamespace->GetInstance(Path("SolidState.Id=\"sda\",Size=8"), kNone); }));
+    EXPECT_EQ(TZELStatusCode::kAlreadyExists, StatusOf([&] { Add(fSolidState, {{"Id", "sda"}, {"Size", Uint64(7)}}); }));
+    Add(fSolidState, {{"Id", "sda"}, {"Size", Uint64(8)}});
+    fNamespace->DeleteInstance(Path("SolidState.Id=\"sda\",Size=7"), kNone);
+    EXPECT_EQ("SolidState.Id=\"sda\",Size=8\n", InstancesOf(*fSolidState));
 }
 
 TEST_F(InMemClassChangeTest, AnInstanceGoesAlthoughItsKeysHaveChangedSince)
 {
-    const auto instance = Add(room, {{"Name", "hall"}});
-    room->AddPropertyDecl(Decl({"Floor", TType::kUint8, {"Key"}}));
-    EXPECT_TRUE(room->RemoveInstance(instance));
-    EXPECT_EQ("", InstancesOf(*room));
+    const auto instance = Add(fRoom, {{"Name", "hall"}});
+    fRoom->AddPropertyDecl(Decl({"Floor", TType::kUint8, {"Key"}}));
+    EXPECT_TRUE(fRoom->RemoveInstance(instance));
+    EXPECT_EQ("", InstancesOf(*fRoom));
 }
 
 TEST_F(InMemClassChangeTest, AReferenceToAClassIsFoundInItsNewSpelling)
 {
     const auto cls = Declare("Place", nullptr);
     cls->AddPropertyDecl(Reference("Where", "Room"));
-    const TCIMReference hall = Add(room, {{"Name", "hall"}})->GetReference();
+    const TCIMReference hall = Add(fRoom, {{"Name", "hall"}})->GetReference();
     const auto instance = Add(cls, {{"Where", TCIMValue(hall)}});
-    room->SetSpelling("ROOM");
-    EXPECT_EQ(instance, ns->GetInstance(instance->GetReference(), none));
+    fRoom->SetSpelling("ROOM");
+    EXPECT_EQ(instance, fNamespace->GetInstance(instance->GetReference(), kNone));
 }
 
-TEST_F(InMemClassChangeTest, AddingAClassFailsWhere)
+TEST_F(InMemClassChangeTest, AddingAClassFailsForATakenNameAndForSuperclassesNotDeclaredHere)
 {
-    const auto tape = Allocate("Tape", device);
-    EXPECT_EQ(15, StatusOf([&] { Allocate("SmallTape", tape)->AddToNamespace(none); }));
-    EXPECT_EQ(12, StatusOf([&] { Declare("DISK", nullptr); }));
-    EXPECT_EQ(12, StatusOf([&] { Allocate("DISK", nullptr)->Validate(none); }));
-    EXPECT_EQ(12, StatusOf([&] { disk->AddToNamespace(none); }));
-    EXPECT_EQ(5, StatusOf([&] { ns->AllocateClass("", nullptr, none); }));
-    EXPECT_EQ(5, StatusOf([&] { ns->AllocateClass("<root>", nullptr, none); }));
+    const auto tape = Allocate("Tape", fDevice);
+    EXPECT_EQ(TZELStatusCode::kNotFound, StatusOf([&] { Allocate("SmallTape", tape)->AddToNamespace(kNone); }));
+    EXPECT_EQ(TZELStatusCode::kAlreadyExists, StatusOf([&] { Declare("DISK", nullptr); }));
+    EXPECT_EQ(TZELStatusCode::kAlreadyExists, StatusOf([&] { Allocate("DISK", nullptr)->Validate(kNone); }));
+    EXPECT_EQ(TZELStatusCode::kAlreadyExists, StatusOf([&] { fDisk->AddToNamespace(kNone); }));
+    EXPECT_EQ(TZELStatusCode::kInvalidParameter, StatusOf([&] { fNamespace->AllocateClass("", nullptr, kNone); }));
+    EXPECT_EQ(TZELStatusCode::kInvalidParameter, StatusOf([&] { fNamespace->AllocateClass("<root>", nullptr, kNone); }));
     const auto other = TInMemNamespace::Create("other");
-    EXPECT_EQ(5, StatusOf([&] { other->AllocateClass("Tape", disk, none); }));
+    EXPECT_EQ(TZELStatusCode::kInvalidParameter, StatusOf([&] { other->AllocateClass("Tape", fDisk, kNone); }));
     EXPECT_EQ("Device Disk SolidState Fan Room", SubClassesOf(*Root(), true));
 }
 
 TEST_F(InMemClassChangeTest, AClassGoesWhenNothingDependsOnIt)
 {
-    const auto instance = Add(solidState, {{"Id", "sda"}});
-    EXPECT_EQ(19, StatusOf([&] { disk->RemoveFromNamespace(none); }));
-    EXPECT_EQ(19, StatusOf([&] { solidState->RemoveFromNamespace(none); }));
-    ns->ClearInstances();
-    solidState->RemoveFromNamespace(none);
-    EXPECT_EQ(15, StatusOf([&] { solidState->RemoveFromNamespace(none); }));
-    EXPECT_EQ(15, StatusOf([&] { instance->AddToNamespace(none); }));
+    const auto instance = Add(fSolidState, {{"Id", "sda"}});
+    EXPECT_EQ(TZELStatusCode::kClassInUse, StatusOf([&] { fDisk->RemoveFromNamespace(kNone); }));
+    EXPECT_EQ(TZELStatusCode::kClassInUse, StatusOf([&] { fSolidState->RemoveFromNamespace(kNone); }));
+    fNamespace->ClearInstances();
+    fSolidState->RemoveFromNamespace(kNone);
+    EXPECT_EQ(TZELStatusCode::kNotFound, StatusOf([&] { fSolidState->RemoveFromNamespace(kNone); }));
+    EXPECT_EQ(TZELStatusCode::kNotFound, StatusOf([&] { instance->AddToNamespace(kNone); }));
     EXPECT_EQ("Device Disk Fan Room", SubClassesOf(*Root(), true));
-    solidState->AddToNamespace(none);
+    fSolidState->AddToNamespace(kNone);
     EXPECT_EQ("Device Disk SolidState Fan Room", SubClassesOf(*Root(), true));
 }
 
 TEST_F(InMemClassChangeTest, ChildClassesAreAddedAndRemovedFromAbove)
 {
-    const auto tape = Allocate("Tape", device);
-    EXPECT_EQ(5, StatusOf([&] { room->AddChildClass(tape); }));
-    EXPECT_EQ(5, StatusOf([&] { device->AddChildClass(nullptr); }));
-    EXPECT_TRUE(device->AddChildClass(tape));
-    EXPECT_FALSE(device->AddChildClass(tape));
-    EXPECT_EQ("Disk Fan Tape", SubClassesOf(*device, false));
-    EXPECT_TRUE(device->RemoveChildClass(tape));
-    EXPECT_FALSE(device->RemoveChildClass(tape));
+    const auto tape = Allocate("Tape", fDevice);
+    EXPECT_EQ(TZELStatusCode::kInvalidParameter, StatusOf([&] { fRoom->AddChildClass(tape); }));
+    EXPECT_EQ(TZELStatusCode::kInvalidParameter, StatusOf([&] { fDevice->AddChildClass(nullptr); }));
+    EXPECT_TRUE(fDevice->AddChildClass(tape));
+    EXPECT_FALSE(fDevice->AddChildClass(tape));
+    EXPECT_EQ("Disk Fan Tape", SubClassesOf(*fDevice, false));
+    EXPECT_TRUE(fDevice->RemoveChildClass(tape));
+    EXPECT_FALSE(fDevice->RemoveChildClass(tape));
     EXPECT_TRUE(Root()->AddChildClass(Allocate("Building", nullptr)));
 }
 
 TEST_F(InMemClassChangeTest, ModifyClassTakesOverWhatIsMissing)
 {
-    const auto more = Allocate("Disk", device, {{"SIZE", TType::kUint64, {}}, {"Model", TType::kString, {"Indexed"}}});
+    const auto more = Allocate("Disk", fDevice, {{"SIZE", TType::kUint64, {}}, {"Model", TType::kString, {"Indexed"}}});
     more->AddQualifier(Qualifier("Version", TCIMValue("3")));
-    more->AddMethodDecl(more->AllocateMethodDecl("Format", TType::kUint32, none));
-    disk->ModifyClass(more, none);
-    EXPECT_EQ("Id Size Model", PropertiesOf(*disk));
-    EXPECT_EQ("Indexed", QualifiersOf(*disk->GetPropertyDecl("Model", none)));
-    EXPECT_EQ("Version", QualifiersOf(*disk));
-    EXPECT_EQ("Format", disk->GetMethodDecl("Format", none)->GetName(none));
-    const auto different = Allocate("Disk", device, {{"First", TType::kString, {}}, {"Size", TType::kString, {}}});
-    EXPECT_EQ(13, StatusOf([&] { disk->ModifyClass(different, none); }));
-    EXPECT_EQ("Id Size Model", PropertiesOf(*disk));
+    more->AddMethodDecl(more->AllocateMethodDecl("Format", TType::kUint32, kNone));
+    fDisk->ModifyClass(more, kNone);
+    EXPECT_EQ("Id Size Model", PropertiesOf(*fDisk));
+    EXPECT_EQ("Indexed", QualifiersOf(*fDisk->GetPropertyDecl("Model", kNone)));
+    EXPECT_EQ("Version", QualifiersOf(*fDisk));
+    EXPECT_EQ("Format", fDisk->GetMethodDecl("Format", kNone)->GetName(kNone));
+    const auto different = Allocate("Disk", fDevice, {{"First", TType::kString, {}}, {"Size", TType::kString, {}}});
+    EXPECT_EQ(TZELStatusCode::kTypeMismatch, StatusOf([&] { fDisk->ModifyClass(different, kNone); }));
+    EXPECT_EQ("Id Size Model", PropertiesOf(*fDisk));
 }
 
-TEST_F(InMemClassChangeTest, ModifyClassTakesOverNothingWhereASubclassStandsInTheWay)
+TEST_F(InMemClassChangeTest, ModifyClassTakesOverNothingIfASubclassHasAnotherType)
 {
-    const auto more = Allocate("Disk", device, {{"Model", TType::kString, {}}, {"Wear", TType::kString, {}}});
-    EXPECT_EQ(13, StatusOf([&] { disk->ModifyClass(more, none); }));
-    EXPECT_EQ("Id Size", PropertiesOf(*disk));
+    const auto more = Allocate("Disk", fDevice, {{"Model", TType::kString, {}}, {"Wear", TType::kString, {}}});
+    EXPECT_EQ(TZELStatusCode::kTypeMismatch, StatusOf([&] { fDisk->ModifyClass(more, kNone); }));
+    EXPECT_EQ("Id Size", PropertiesOf(*fDisk));
 }
 
 TEST_F(InMemClassChangeTest, ANameMayChangeItsLetterCaseAndNothingElse)
 {
-    disk->SetSpelling("DISK");
-    EXPECT_EQ("DISK", ns->GetClass("disk", none)->GetName(none));
-    EXPECT_EQ(5, StatusOf([&] { disk->SetSpelling("Disc"); }));
-    disk->FindPropertyDecl("Size")->SetSpelling("size");
-    EXPECT_EQ("Id size Wear", PropertiesOf(*solidState));
-    EXPECT_EQ(5, StatusOf([&] { disk->FindPropertyDecl("Size")->SetSpelling("siz"); }));
+    fDisk->SetSpelling("DISK");
+    EXPECT_EQ("DISK", fNamespace->GetClass("disk", kNone)->GetName(kNone));
+    EXPECT_EQ(TZELStatusCode::kInvalidParameter, StatusOf([&] { fDisk->SetSpelling("Disc"); }));
+    fDisk->FindPropertyDecl("Size")->SetSpelling("size");
+    EXPECT_EQ("Id size Wear", PropertiesOf(*fSolidState));
+    EXPECT_EQ(TZELStatusCode::kInvalidParameter, StatusOf([&] { fDisk->FindPropertyDecl("Size")->SetSpelling("siz"); }));
 }
 
 }  // namespace

@@ -9,15 +9,15 @@ TEST_F(InMemClassTest, PseudoClassRootStandsAboveAllTopLevelClasses)
 {
     EXPECT_EQ("Device Room", SubClassesOf(*Root(), false));
     EXPECT_EQ("Device Disk SolidState Fan Room", SubClassesOf(*Root(), true));
-    EXPECT_EQ("<root>", Root()->GetName(none));
-    EXPECT_EQ(nullptr, Root()->GetSuperClass(none));
-    EXPECT_EQ(nullptr, device->GetSuperClass(none));
-    EXPECT_TRUE(device->IsRootClass(none));
-    EXPECT_FALSE(disk->IsRootClass(none));
-    EXPECT_FALSE(Root()->IsRootClass(none));
+    EXPECT_EQ("<root>", Root()->GetName(kNone));
+    EXPECT_EQ(nullptr, Root()->GetSuperClass(kNone));
+    EXPECT_EQ(nullptr, fDevice->GetSuperClass(kNone));
+    EXPECT_TRUE(fDevice->IsRootClass(kNone));
+    EXPECT_FALSE(fDisk->IsRootClass(kNone));
+    EXPECT_FALSE(Root()->IsRootClass(kNone));
 }
 
-TEST_F(InMemClassTest, EnumerationsStopWhereTheCallbackSaysSo)
+TEST_F(InMemClassTest, EnumerationsStopWhenTheCallbackReturnsFalse)
 {
     std::string seen;
     Root()->EnumerateSubClasses(
@@ -25,81 +25,81 @@ TEST_F(InMemClassTest, EnumerationsStopWhereTheCallbackSaysSo)
             seen += cls->GetName(TCallContext());
             return false;
         },
-        true, none);
+        true, kNone);
     EXPECT_EQ("Device", seen);
 }
 
 TEST_F(InMemClassTest, ClassesAreFoundInAnyLetterCaseAndKeepTheirSpelling)
 {
-    EXPECT_EQ("SolidState", ns->GetClass("SOLIDSTATE", none)->GetName(none));
-    EXPECT_EQ(15, StatusOf([&] { ns->GetClass("Tape", none); }));
-    EXPECT_EQ(15, StatusOf([&] { ns->GetClass("", none); }));
+    EXPECT_EQ("SolidState", fNamespace->GetClass("SOLIDSTATE", kNone)->GetName(kNone));
+    EXPECT_EQ(TZELStatusCode::kNotFound, StatusOf([&] { fNamespace->GetClass("Tape", kNone); }));
+    EXPECT_EQ(TZELStatusCode::kNotFound, StatusOf([&] { fNamespace->GetClass("", kNone); }));
 }
 
 TEST_F(InMemClassTest, RelationsBetweenClasses)
 {
-    EXPECT_TRUE(solidState->IsSubclassOf(device, none));
-    EXPECT_TRUE(disk->IsSubclassOf(disk, none));
-    EXPECT_TRUE(disk->IsSubclassOf(Root(), none));
-    EXPECT_FALSE(disk->IsSubclassOf(solidState, none));
-    EXPECT_FALSE(disk->IsSubclassOf(room, none));
-    EXPECT_EQ("Disk", solidState->GetSuperClass(none)->GetName(none));
-    EXPECT_TRUE(*disk == *ns->GetClass("DISK", none));
-    EXPECT_TRUE(*disk < *fan);
-    EXPECT_FALSE(*fan < *disk);
-    EXPECT_EQ(ns, disk->GetNamespace(none));
+    EXPECT_TRUE(fSolidState->IsSubclassOf(fDevice, kNone));
+    EXPECT_TRUE(fDisk->IsSubclassOf(fDisk, kNone));
+    EXPECT_TRUE(fDisk->IsSubclassOf(Root(), kNone));
+    EXPECT_FALSE(fDisk->IsSubclassOf(fSolidState, kNone));
+    EXPECT_FALSE(fDisk->IsSubclassOf(fRoom, kNone));
+    EXPECT_EQ("Disk", fSolidState->GetSuperClass(kNone)->GetName(kNone));
+    EXPECT_TRUE(*fDisk == *fNamespace->GetClass("DISK", kNone));
+    EXPECT_TRUE(*fDisk < *fFan);
+    EXPECT_FALSE(*fFan < *fDisk);
+    EXPECT_EQ(fNamespace, fDisk->GetNamespace(kNone));
 }
 
 TEST_F(InMemClassTest, PropertiesAndKeysAreInherited)
 {
-    EXPECT_EQ("Id Size Wear", PropertiesOf(*solidState));
-    EXPECT_EQ("Id", KeysOf(*solidState));
-    EXPECT_EQ("Size", solidState->GetPropertyDecl("SIZE", none)->GetName(none));
-    EXPECT_EQ(15, StatusOf([&] { disk->GetPropertyDecl("Wear", none); }));
+    EXPECT_EQ("Id Size Wear", PropertiesOf(*fSolidState));
+    EXPECT_EQ("Id", KeysOf(*fSolidState));
+    EXPECT_EQ("Size", fSolidState->GetPropertyDecl("SIZE", kNone)->GetName(kNone));
+    EXPECT_EQ(TZELStatusCode::kNotFound, StatusOf([&] { fDisk->GetPropertyDecl("Wear", kNone); }));
 }
 
-TEST_F(InMemClassTest, QualifiersReachSubclassesWhereTheirFlavorSaysSo)
+TEST_F(InMemClassTest, QualifiersAreInheritedIfTheirFlavorSaysSo)
 {
-    device->AddQualifier(Qualifier("Version", TCIMValue("2"), ICIMQualifierDecl::kFlavorOverridable), none);
-    device->AddQualifier(Qualifier("Vendor", TCIMValue("any")), none);
-    device->AddQualifier(Qualifier("Unit", TCIMValue("one")), none);
-    disk->AddQualifier(Qualifier("UNIT", TCIMValue("two")), none);
-    EXPECT_EQ("Version Vendor Unit", QualifiersOf(*device));
-    EXPECT_EQ("UNIT Vendor", QualifiersOf(*disk));
-    EXPECT_EQ("two", solidState->GetQualifier("unit", none)->GetValue(none).ToText());
-    EXPECT_EQ(15, StatusOf([&] { disk->GetQualifier("Version", none); }));
+    fDevice->AddQualifier(Qualifier("Version", TCIMValue("2"), ICIMQualifierDecl::kFlavorOverridable), kNone);
+    fDevice->AddQualifier(Qualifier("Vendor", TCIMValue("any")), kNone);
+    fDevice->AddQualifier(Qualifier("Unit", TCIMValue("one")), kNone);
+    fDisk->AddQualifier(Qualifier("UNIT", TCIMValue("two")), kNone);
+    EXPECT_EQ("Version Vendor Unit", QualifiersOf(*fDevice));
+    EXPECT_EQ("UNIT Vendor", QualifiersOf(*fDisk));
+    EXPECT_EQ("two", fSolidState->GetQualifier("unit", kNone)->GetValue(kNone).ToText());
+    EXPECT_EQ(TZELStatusCode::kNotFound, StatusOf([&] { fDisk->GetQualifier("Version", kNone); }));
     bool found = true;
-    EXPECT_EQ(nullptr, disk->GetQualifier("Version", found, none));
+    EXPECT_EQ(nullptr, fDisk->GetQualifier("Version", found, kNone));
     EXPECT_FALSE(found);
-    EXPECT_NE(nullptr, disk->GetQualifier("Vendor", found, none));
+    EXPECT_NE(nullptr, fDisk->GetQualifier("Vendor", found, kNone));
     EXPECT_TRUE(found);
-    EXPECT_EQ(5, StatusOf([&] { disk->AddQualifier(nullptr, none); }));
+    EXPECT_EQ(TZELStatusCode::kInvalidParameter, StatusOf([&] { fDisk->AddQualifier(nullptr, kNone); }));
 }
 
 TEST_F(InMemClassTest, QualifiersAreMadeOfTheirDeclaration)
 {
-    const auto decl = ns->AllocateQualifierDecl("MaxLen", TCIMValue::Null(TType::kUint32), ICIMQualifierDecl::kScopeProperty,
-                                                ICIMQualifierDecl::kFlavorToSubclass, none);
-    const auto qualifier = disk->AllocateQualifier(decl, TCIMValue(64U), none);
-    EXPECT_EQ("MaxLen", qualifier->GetName(none));
-    EXPECT_EQ(TCIMValue(64U), qualifier->GetValue(none));
-    EXPECT_EQ(ICIMQualifierDecl::kFlavorToSubclass, qualifier->GetFlavor(none));
+    const auto decl = fNamespace->AllocateQualifierDecl(
+        "MaxLen", TCIMValue::Null(TType::kUint32), ICIMQualifierDecl::kScopeProperty, ICIMQualifierDecl::kFlavorToSubclass, kNone);
+    const auto qualifier = fDisk->AllocateQualifier(decl, TCIMValue(64U), kNone);
+    EXPECT_EQ("MaxLen", qualifier->GetName(kNone));
+    EXPECT_EQ(TCIMValue(64U), qualifier->GetValue(kNone));
+    EXPECT_EQ(ICIMQualifierDecl::kFlavorToSubclass, qualifier->GetFlavor(kNone));
     EXPECT_EQ(ICIMQualifierDecl::kFlavorNone,
-              disk->AllocateQualifier(decl, TCIMValue(64U), ICIMQualifierDecl::kFlavorNone, none)->GetFlavor(none));
-    EXPECT_EQ(TType::kUint32, disk->AllocateQualifier(decl, TCIMValue(), none)->GetValue(none).GetType());
-    EXPECT_EQ(13, StatusOf([&] { disk->AllocateQualifier(decl, TCIMValue("64"), none); }));
+              fDisk->AllocateQualifier(decl, TCIMValue(64U), ICIMQualifierDecl::kFlavorNone, kNone)->GetFlavor(kNone));
+    EXPECT_EQ(TType::kUint32, fDisk->AllocateQualifier(decl, TCIMValue(), kNone)->GetValue(kNone).GetType());
+    EXPECT_EQ(TZELStatusCode::kTypeMismatch, StatusOf([&] { fDisk->AllocateQualifier(decl, TCIMValue("64"), kNone); }));
 }
 
 TEST_F(InMemClassTest, AssociationIsInheritedWhateverItsFlavorAndAbstractIsNot)
 {
     const auto link = Declare("Link", nullptr);
     const auto cable = Declare("Cable", link);
-    link->AddQualifier(Qualifier("Association", TCIMValue(true), ICIMQualifierDecl::kFlavorNone), none);
-    link->AddQualifier(Qualifier("Abstract"), none);
-    EXPECT_TRUE(cable->IsAssociation(none));
-    EXPECT_FALSE(disk->IsAssociation(none));
-    EXPECT_TRUE(link->IsAbstract(none));
-    EXPECT_FALSE(cable->IsAbstract(none));
+    link->AddQualifier(Qualifier("Association", TCIMValue(true), ICIMQualifierDecl::kFlavorNone), kNone);
+    link->AddQualifier(Qualifier("Abstract"), kNone);
+    EXPECT_TRUE(cable->IsAssociation(kNone));
+    EXPECT_FALSE(fDisk->IsAssociation(kNone));
+    EXPECT_TRUE(link->IsAbstract(kNone));
+    EXPECT_FALSE(cable->IsAbstract(kNone));
 }
 
 TEST_F(InMemClassTest, AssociationsAreFoundFromBothEndsAndFromSubclasses)
@@ -108,28 +108,28 @@ TEST_F(InMemClassTest, AssociationsAreFoundFromBothEndsAndFromSubclasses)
     location->AddQualifier(Qualifier("Association"));
     location->AddPropertyDecl(Reference("Thing", "Device"));
     location->AddPropertyDecl(Reference("Place", "Room"));
-    location->AddToNamespace(none);
+    location->AddToNamespace(kNone);
     const auto associated = [&](const TClassPointer& cls, const std::string& association, const std::string& result,
                                 const std::string& role, const std::string& resultRole) {
         return NamesOf<ICIMClass>([&](const auto& callback) {
             cls->EnumerateAssociatedClasses(callback, association, result, role, resultRole, TCallContext());
         });
     };
-    EXPECT_EQ("Room", associated(solidState, "", "", "", ""));
-    EXPECT_EQ("Room", associated(solidState, "location", "room", "thing", "place"));
-    EXPECT_EQ("Device", associated(room, "", "", "", ""));
-    EXPECT_EQ("", associated(disk, "", "", "Place", ""));
-    EXPECT_EQ("", associated(disk, "", "", "", "Thing"));
-    EXPECT_EQ("", associated(disk, "Room", "", "", ""));
-    EXPECT_EQ("", associated(disk, "", "Fan", "", ""));
+    EXPECT_EQ("Room", associated(fSolidState, "", "", "", ""));
+    EXPECT_EQ("Room", associated(fSolidState, "location", "room", "thing", "place"));
+    EXPECT_EQ("Device", associated(fRoom, "", "", "", ""));
+    EXPECT_EQ("", associated(fDisk, "", "", "Place", ""));
+    EXPECT_EQ("", associated(fDisk, "", "", "", "Thing"));
+    EXPECT_EQ("", associated(fDisk, "Room", "", "", ""));
+    EXPECT_EQ("", associated(fDisk, "", "Fan", "", ""));
     const auto associations = [&](const TClassPointer& cls, const std::string& result, const std::string& role) {
         return NamesOf<ICIMClass>(
             [&](const auto& callback) { cls->EnumerateAssociationClasses(callback, result, role, TCallContext()); });
     };
-    EXPECT_EQ("Location", associations(disk, "", ""));
-    EXPECT_EQ("Location", associations(room, "LOCATION", "PLACE"));
-    EXPECT_EQ("", associations(room, "", "Thing"));
-    EXPECT_EQ("", associations(room, "Disk", ""));
+    EXPECT_EQ("Location", associations(fDisk, "", ""));
+    EXPECT_EQ("Location", associations(fRoom, "LOCATION", "PLACE"));
+    EXPECT_EQ("", associations(fRoom, "", "Thing"));
+    EXPECT_EQ("", associations(fRoom, "Disk", ""));
     EXPECT_EQ("", associations(location, "", ""));
 }
 
@@ -137,105 +137,107 @@ TEST_F(InMemClassTest, AnAssociationClassCanBeNamed)
 {
     const auto link = Declare("Link", nullptr);
     const auto associations = [&] {
-        return NamesOf<ICIMClass>([&](const auto& callback) { room->EnumerateAssociationClasses(callback, "", "", none); });
+        return NamesOf<ICIMClass>([&](const auto& callback) { fRoom->EnumerateAssociationClasses(callback, "", "", kNone); });
     };
-    EXPECT_TRUE(room->AddAssociationClass(link));
-    EXPECT_FALSE(room->AddAssociationClass(link));
+    EXPECT_TRUE(fRoom->AddAssociationClass(link));
+    EXPECT_FALSE(fRoom->AddAssociationClass(link));
     EXPECT_EQ("Link", associations());
-    EXPECT_TRUE(room->RemoveAssociationClass(link));
-    EXPECT_FALSE(room->RemoveAssociationClass(link));
+    EXPECT_TRUE(fRoom->RemoveAssociationClass(link));
+    EXPECT_FALSE(fRoom->RemoveAssociationClass(link));
     EXPECT_EQ("", associations());
-    EXPECT_EQ(5, StatusOf([&] { room->AddAssociationClass(nullptr); }));
+    EXPECT_EQ(TZELStatusCode::kInvalidParameter, StatusOf([&] { fRoom->AddAssociationClass(nullptr); }));
 }
 
 TEST_F(InMemClassTest, MethodsAreInheritedAndOverridden)
 {
     const auto methods = [&](const TClassPointer& cls) {
-        return NamesOf<ICIMMethodDecl>([&](const auto& callback) { cls->EnumerateMethodDecls(callback, none); });
+        return NamesOf<ICIMMethodDecl>([&](const auto& callback) { cls->EnumerateMethodDecls(callback, kNone); });
     };
-    const auto reset = device->AllocateMethodDecl("Reset", TType::kUint32, none);
-    reset->AddQualifier(Qualifier("Description", TCIMValue("starts anew")), none);
-    EXPECT_TRUE(device->AddMethodDecl(reset));
-    EXPECT_FALSE(device->AddMethodDecl(device->AllocateMethodDecl("RESET", TType::kUint32, none)));
-    EXPECT_TRUE(disk->AddMethodDecl(disk->AllocateMethodDecl("Format", TType::kBoolean, none)));
-    const auto own = disk->AllocateMethodDecl("reset", TType::kUint32, none);
-    EXPECT_TRUE(disk->AddMethodDecl(own));
-    EXPECT_EQ("reset Format", methods(solidState));
+    const auto reset = fDevice->AllocateMethodDecl("Reset", TType::kUint32, kNone);
+    reset->AddQualifier(Qualifier("Description", TCIMValue("starts anew")), kNone);
+    EXPECT_TRUE(fDevice->AddMethodDecl(reset));
+    EXPECT_FALSE(fDevice->AddMethodDecl(fDevice->AllocateMethodDecl("RESET", TType::kUint32, kNone)));
+    EXPECT_TRUE(fDisk->AddMethodDecl(fDisk->AllocateMethodDecl("Format", TType::kBoolean, kNone)));
+    const auto own = fDisk->AllocateMethodDecl("reset", TType::kUint32, kNone);
+    EXPECT_TRUE(fDisk->AddMethodDecl(own));
+    EXPECT_EQ("reset Format", methods(fSolidState));
     EXPECT_EQ("Description", QualifiersOf(*own));
-    EXPECT_EQ(TType::kBoolean, solidState->GetMethodDecl("format", none)->GetType(none));
-    EXPECT_TRUE(disk->RemoveMethodDecl(own));
-    EXPECT_FALSE(disk->RemoveMethodDecl(own));
-    EXPECT_EQ("Reset Format", methods(solidState));
-    EXPECT_EQ(15, StatusOf([&] { device->GetMethodDecl("Format", none); }));
+    EXPECT_EQ(TType::kBoolean, fSolidState->GetMethodDecl("format", kNone)->GetType(kNone));
+    EXPECT_TRUE(fDisk->RemoveMethodDecl(own));
+    EXPECT_FALSE(fDisk->RemoveMethodDecl(own));
+    EXPECT_EQ("Reset Format", methods(fSolidState));
+    EXPECT_EQ(TZELStatusCode::kNotFound, StatusOf([&] { fDevice->GetMethodDecl("Format", kNone); }));
     TCallContext arguments;
-    EXPECT_EQ(1, StatusOf([&] { disk->InvokeMethod("Reset", arguments, none); }));
-    EXPECT_EQ(15, StatusOf([&] { disk->InvokeMethod("Grow", arguments, none); }));
-    EXPECT_EQ(5, StatusOf([&] { disk->AllocateMethodDecl("", TType::kUint32, none); }));
+    EXPECT_EQ(TZELStatusCode::kNotOffered, StatusOf([&] { fDisk->InvokeMethod("Reset", arguments, kNone); }));
+    EXPECT_EQ(TZELStatusCode::kNotFound, StatusOf([&] { fDisk->InvokeMethod("Grow", arguments, kNone); }));
+    EXPECT_EQ(TZELStatusCode::kInvalidParameter, StatusOf([&] { fDisk->AllocateMethodDecl("", TType::kUint32, kNone); }));
 }
 
 TEST_F(InMemClassTest, AStaticPropertyIsOneForClassSubclassesAndInstances)
 {
-    device->AddPropertyDecl(Decl({"Count", TType::kUint32, {"Static"}}));
-    const auto instance = Add(disk, {{"Id", "sda"}});
-    device->SetPropertyValue("Count", TCIMValue(3U), none);
+    fDevice->AddPropertyDecl(Decl({"Count", TType::kUint32, {"Static"}}));
+    const auto instance = Add(fDisk, {{"Id", "sda"}});
+    fDevice->SetPropertyValue("Count", TCIMValue(3U), kNone);
     EXPECT_EQ("Id=sda Count=3 Size=NULL", ValuesOf(*instance));
-    instance->GetProperty("count", none)->SetValue(TCIMValue(4U), none);
-    EXPECT_EQ(TCIMValue(4U), solidState->GetProperty("Count", none)->GetValue(none));
-    EXPECT_EQ("Count", solidState->GetProperty("Count", none)->GetPropertyDecl(none)->GetName(none));
+    instance->GetProperty("count", kNone)->SetValue(TCIMValue(4U), kNone);
+    EXPECT_EQ(TCIMValue(4U), fSolidState->GetProperty("Count", kNone)->GetValue(kNone));
+    EXPECT_EQ("Count", fSolidState->GetProperty("Count", kNone)->GetPropertyDecl(kNone)->GetName(kNone));
     int statics = 0;
-    solidState->EnumerateStaticProperties([&statics](boost::shared_ptr<ICIMProperty>) { return ++statics > 0; }, none);
+    fSolidState->EnumerateStaticProperties([&statics](boost::shared_ptr<ICIMProperty>) { return ++statics > 0; }, kNone);
     EXPECT_EQ(1, statics);
-    EXPECT_EQ(13, StatusOf([&] { device->SetPropertyValue("Count", TCIMValue("4"), none); }));
-    EXPECT_EQ(15, StatusOf([&] { device->SetPropertyValue("Id", TCIMValue("4"), none); }));
-    EXPECT_EQ(15, StatusOf([&] { device->GetProperty("Nothing", none); }));
+    EXPECT_EQ(TZELStatusCode::kTypeMismatch, StatusOf([&] { fDevice->SetPropertyValue("Count", TCIMValue("4"), kNone); }));
+    EXPECT_EQ(TZELStatusCode::kNotFound, StatusOf([&] { fDevice->SetPropertyValue("Id", TCIMValue("4"), kNone); }));
+    EXPECT_EQ(TZELStatusCode::kNotFound, StatusOf([&] { fDevice->GetProperty("Nothing", kNone); }));
 }
 
-TEST_F(InMemClassTest, DeclarationsTellTypeDefaultAndReferenceClass)
+TEST_F(InMemClassTest, DeclarationsHoldTypeDefaultAndReferenceClass)
 {
-    const auto size = disk->AllocatePropertyDecl("Size", TCIMValue(7U), none);
-    EXPECT_EQ(TType::kUint32, size->GetType(none));
-    EXPECT_EQ(TCIMValue(7U), size->GetDefaultValue(none));
+    const auto size = fDisk->AllocatePropertyDecl("Size", TCIMValue(7U), kNone);
+    EXPECT_EQ(TType::kUint32, size->GetType(kNone));
+    EXPECT_EQ(TCIMValue(7U), size->GetDefaultValue(kNone));
     TCIMReference toRoom;
-    toRoom.SetClass(room);
+    toRoom.SetClass(fRoom);
     TInMemPropertyDecl place("Place", TCIMValue(toRoom));
     EXPECT_EQ("Room", place.GetReferenceClass());
     EXPECT_TRUE(place.GetDefaultValue().IsNull());
-    EXPECT_EQ(5, StatusOf([&] { disk->AllocatePropertyDecl("", TCIMValue(7U), none); }));
-    EXPECT_EQ(13, StatusOf([&] { disk->AllocatePropertyDecl("Size", TCIMValue(), none); }));
+    EXPECT_EQ(TZELStatusCode::kInvalidParameter, StatusOf([&] { fDisk->AllocatePropertyDecl("", TCIMValue(7U), kNone); }));
+    EXPECT_EQ(TZELStatusCode::kTypeMismatch, StatusOf([&] { fDisk->AllocatePropertyDecl("Size", TCIMValue(), kNone); }));
 }
 
 TEST_F(InMemClassTest, HandlesOutliveTheNamespace)
 {
-    ns.reset();
-    EXPECT_EQ("Id Size Wear", PropertiesOf(*solidState));
-    EXPECT_EQ("", SubClassesOf(*solidState, true));
-    EXPECT_EQ(nullptr, disk->GetNamespace(none));
-    EXPECT_EQ(18, StatusOf([&] { disk->EnumerateInstances([](boost::shared_ptr<ICIMInstance>) { return true; }, true, none); }));
-    EXPECT_EQ(18, StatusOf([&] { disk->AddToNamespace(none); }));
-    EXPECT_EQ(18, StatusOf([&] { disk->RemoveFromNamespace(none); }));
-    EXPECT_EQ(18, StatusOf([&] { disk->Validate(none); }));
-    EXPECT_EQ(
-        18, StatusOf([&] { disk->EnumerateAssociationClasses([](boost::shared_ptr<ICIMClass>) { return true; }, "", "", none); }));
-    EXPECT_EQ(18, StatusOf([&] { disk->AllocateInstance(none)->AddToNamespace(none); }));
+    fNamespace.reset();
+    EXPECT_EQ("Id Size Wear", PropertiesOf(*fSolidState));
+    EXPECT_EQ("", SubClassesOf(*fSolidState, true));
+    EXPECT_EQ(nullptr, fDisk->GetNamespace(kNone));
+    EXPECT_EQ(TZELStatusCode::kNamespaceGone,
+              StatusOf([&] { fDisk->EnumerateInstances([](boost::shared_ptr<ICIMInstance>) { return true; }, true, kNone); }));
+    EXPECT_EQ(TZELStatusCode::kNamespaceGone, StatusOf([&] { fDisk->AddToNamespace(kNone); }));
+    EXPECT_EQ(TZELStatusCode::kNamespaceGone, StatusOf([&] { fDisk->RemoveFromNamespace(kNone); }));
+    EXPECT_EQ(TZELStatusCode::kNamespaceGone, StatusOf([&] { fDisk->Validate(kNone); }));
+    EXPECT_EQ(18, StatusOf([&] {
+                  fDisk->EnumerateAssociationClasses([](boost::shared_ptr<ICIMClass>) { return true; }, "", "", kNone);
+              }));
+    EXPECT_EQ(TZELStatusCode::kNamespaceGone, StatusOf([&] { fDisk->AllocateInstance(kNone)->AddToNamespace(kNone); }));
 }
 
 TEST_F(InMemClassTest, AssignmentTakesNothingOver)
 {
-    ICIMClass& target = *disk;
-    EXPECT_EQ(&target, &(target = *room));
-    EXPECT_EQ("Id Size", PropertiesOf(*disk));
+    ICIMClass& target = *fDisk;
+    EXPECT_EQ(&target, &(target = *fRoom));
+    EXPECT_EQ("Id Size", PropertiesOf(*fDisk));
 }
 
 TEST_F(InMemClassTest, ALongLineOfSubclassesIsWalkedAndDestroyedWithoutRecursion)
 {
-    TClassPointer last = room;
+    TClassPointer last = fRoom;
     for (int depth = 0; depth < 60000; ++depth) {
         last = Declare("C" + std::to_string(depth), last);
     }
-    EXPECT_TRUE(last->IsSubclassOf(room, none));
-    EXPECT_EQ(60000U, room->GetClassesBelow().size());
+    EXPECT_TRUE(last->IsSubclassOf(fRoom, kNone));
+    EXPECT_EQ(60000U, fRoom->GetClassesBelow().size());
     last.reset();
-    ns.reset();
+    fNamespace.reset();
 }
 
 }  // namespace

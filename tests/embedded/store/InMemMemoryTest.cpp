@@ -3,7 +3,7 @@
 #include <cstdio>
 
 #include "tests/embedded/store/CountedAllocations.h"
-#include "tests/embedded/store/InMemFixture.h"
+#include "tests/embedded/store/TInMemFixture.h"
 
 namespace NORVZEL20 {
 namespace {
@@ -15,7 +15,7 @@ std::size_t HeapInUse()
 }
 
 #if defined(__SANITIZE_ADDRESS__) || defined(__SANITIZE_THREAD__)
-constexpr bool kOwnHeap = false;  // the sanitizer's heap does not tell what is in use
+constexpr bool kOwnHeap = false;  // mallinfo2 does not see the sanitizer's heap
 #else
 constexpr bool kOwnHeap = true;
 #endif
@@ -35,7 +35,7 @@ class InMemMemoryTest : public TInMemFixture {
         cls->AddPropertyDecl(Decl({"Priority", TType::kUint16, {}}));
         cls->AddPropertyDecl(Decl({"Essential", TType::kBoolean, {}}));
         cls->AddPropertyDecl(Decl({"Architecture", TType::kString, {}}));
-        cls->AddToNamespace(none);
+        cls->AddToNamespace(kNone);
         return cls;
     }
 
@@ -46,8 +46,8 @@ class InMemMemoryTest : public TInMemFixture {
         for (std::uint32_t slot = 0; slot < 8; ++slot) {
             instance->SetSlot(slot, TCIMValue(text + std::string(slot * 3, 'x')));
         }
-        instance->SetSlot(8, TCIMValue(std::uint64_t(number)));
-        instance->SetSlot(9, TCIMValue(std::uint64_t(number) * 3));
+        instance->SetSlot(8, Uint64(number));
+        instance->SetSlot(9, Uint64(number * 3));
         instance->SetSlot(10, TCIMValue(static_cast<unsigned short>(5)));
         instance->SetSlot(11, TCIMValue(false));
         instance->SetSlot(12, TCIMValue("amd64"));
@@ -67,7 +67,7 @@ TEST_F(InMemMemoryTest, AnInstanceOfThirteenPropertiesTakesAtMostAThousandBytes)
         AddPackage(cls, number);
     }
     const std::size_t each = (HeapInUse() - before) / kCount;
-    RecordProperty("BytesPerInstance", int(each));
+    RecordProperty("BytesPerInstance", static_cast<int>(each));
     std::printf("%zu bytes per instance\n", each);
     EXPECT_GT(each, 500U);
     EXPECT_LE(each, 1000U);
@@ -81,13 +81,13 @@ TEST_F(InMemMemoryTest, ReadingAPropertyAllocatesNothing)
     cls->EnumerateInstances(
         [&](boost::shared_ptr<ICIMInstance> instance) {
             const std::size_t before = CountedAllocations();
-            const auto property = instance->GetProperty(name, none);
-            const TCIMValue value = property->GetValue(none);
+            const auto property = instance->GetProperty(name, kNone);
+            const TCIMValue value = property->GetValue(kNone);
             EXPECT_EQ(before, CountedAllocations());
             EXPECT_EQ("amd64", value.GetString());
             return true;
         },
-        false, none);
+        false, kNone);
 }
 
 TEST_F(InMemMemoryTest, AnInstanceIsOneAllocation)

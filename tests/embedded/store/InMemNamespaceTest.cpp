@@ -1,29 +1,30 @@
-#include "tests/embedded/store/InMemFixture.h"
+#include <limits>
 
 #include "embedded/store/TInMemNamespaceProvider.h"
 #include "host/TCIMDateTime.h"
 #include "host/TNamespaceProviderManager.h"
+#include "tests/embedded/store/TInMemFixture.h"
 
 namespace NORVZEL20 {
 namespace {
 
 class InMemNamespaceTest : public TInMemFixture {
   protected:
-    TClassPointer disk = DeclareDisk();
+    TClassPointer fDisk = DeclareDisk();
 };
 
 TEST_F(InMemNamespaceTest, ProviderInmemIsThereFromTheStart)
 {
     const auto provider = TNamespaceProviderManager::GetInstance()->FindProvider("inmem");
     ASSERT_NE(nullptr, provider);
-    EXPECT_EQ("inmem", provider->GetName(none));
-    EXPECT_EQ(0, provider->GetType(none));
-    EXPECT_FALSE(provider->IsIndicationsSupported(none));
-    const auto first = provider->AllocateNamespace(none, false, "root/cimv2");
-    const auto second = provider->AllocateNamespace(none, true, "root/cimv2");
+    EXPECT_EQ("inmem", provider->GetName(kNone));
+    EXPECT_EQ(0, provider->GetType(kNone));
+    EXPECT_FALSE(provider->IsIndicationsSupported(kNone));
+    const auto first = provider->AllocateNamespace(kNone, false, "root/cimv2");
+    const auto second = provider->AllocateNamespace(kNone, true, "root/cimv2");
     EXPECT_NE(first, second);
-    EXPECT_EQ(provider, first->GetNamespaceProvider(none));
-    EXPECT_EQ(15, StatusOf([&] { first->GetClass("Disk", none); }));
+    EXPECT_EQ(provider, first->GetNamespaceProvider(kNone));
+    EXPECT_EQ(TZELStatusCode::kNotFound, StatusOf([&] { first->GetClass("Disk", kNone); }));
     EXPECT_EQ("root/cimv2", boost::dynamic_pointer_cast<TInMemNamespace>(first)->GetNamespaceName());
 }
 
@@ -35,56 +36,56 @@ TEST_F(InMemNamespaceTest, SlashesAroundItsNameAreTakenOff)
 
 TEST_F(InMemNamespaceTest, InstancesComeInOrderOfInsertionAndOfExactlyTheClass)
 {
-    const auto fast = Declare("FastDisk", disk);
-    Add(disk, {{"Id", "sdb"}});
+    const auto fast = Declare("FastDisk", fDisk);
+    Add(fDisk, {{"Id", "sdb"}});
     Add(fast, {{"Id", "sda"}});
-    Add(disk, {{"Id", "sda"}});
-    EXPECT_EQ("Disk.Id=\"sdb\"\nDisk.Id=\"sda\"\n", InstancesOf(*disk));
-    EXPECT_EQ("Disk.Id=\"sdb\"\nDisk.Id=\"sda\"\nFastDisk.Id=\"sda\"\n", InstancesOf(*disk, true));
-    EXPECT_EQ("", InstancesOf(*ns->GetClass("<root>", none)));
-    EXPECT_EQ("Disk.Id=\"sdb\"\nDisk.Id=\"sda\"\nFastDisk.Id=\"sda\"\n", InstancesOf(*ns->GetClass("<root>", none), true));
+    Add(fDisk, {{"Id", "sda"}});
+    EXPECT_EQ("Disk.Id=\"sdb\"\nDisk.Id=\"sda\"\n", InstancesOf(*fDisk));
+    EXPECT_EQ("Disk.Id=\"sdb\"\nDisk.Id=\"sda\"\nFastDisk.Id=\"sda\"\n", InstancesOf(*fDisk, true));
+    EXPECT_EQ("", InstancesOf(*fNamespace->GetClass("<root>", kNone)));
+    EXPECT_EQ("Disk.Id=\"sdb\"\nDisk.Id=\"sda\"\nFastDisk.Id=\"sda\"\n", InstancesOf(*fNamespace->GetClass("<root>", kNone), true));
 }
 
 TEST_F(InMemNamespaceTest, InstancesMayComeAndGoWhileTheyAreEnumerated)
 {
     for (int number = 0; number < 100; ++number) {
-        Add(disk, {{"Id", TCIMValue(std::to_string(number))}});
+        Add(fDisk, {{"Id", TCIMValue(std::to_string(number))}});
     }
     int seen = 0;
-    disk->EnumerateInstances(
+    fDisk->EnumerateInstances(
         [&](boost::shared_ptr<ICIMInstance> instance) {
-            Add(disk, {{"Id", TCIMValue("new" + std::to_string(seen))}});
-            ns->DeleteInstance(instance->GetReference(none), none);
+            Add(fDisk, {{"Id", TCIMValue("new" + std::to_string(seen))}});
+            fNamespace->DeleteInstance(instance->GetReference(kNone), kNone);
             return ++seen > 0;
         },
-        false, none);
+        false, kNone);
     EXPECT_EQ(100, seen);
-    EXPECT_EQ(100U, disk->GetInstanceCount());
+    EXPECT_EQ(100U, fDisk->GetInstanceCount());
 }
 
 TEST_F(InMemNamespaceTest, AllInstancesMayBeDeletedWhileTheyAreEnumerated)
 {
     for (int number = 0; number < 100; ++number) {
-        Add(disk, {{"Id", TCIMValue(std::to_string(number))}});
+        Add(fDisk, {{"Id", TCIMValue(std::to_string(number))}});
     }
     int seen = 0;
-    disk->EnumerateInstances(
+    fDisk->EnumerateInstances(
         [&](boost::shared_ptr<ICIMInstance> instance) {
-            ns->DeleteInstance(instance->GetReference(none), none);
+            fNamespace->DeleteInstance(instance->GetReference(kNone), kNone);
             return ++seen > 0;
         },
-        false, none);
+        false, kNone);
     EXPECT_EQ(100, seen);
-    EXPECT_EQ("", InstancesOf(*disk));
+    EXPECT_EQ("", InstancesOf(*fDisk));
 }
 
 TEST_F(InMemNamespaceTest, PathsFindInstancesWhateverTheirNamespaceAndLetterCase)
 {
-    const auto instance = Add(disk, {{"Id", "sda"}});
+    const auto instance = Add(fDisk, {{"Id", "sda"}});
     for (const char* path : {"Disk.Id=\"sda\"", "root/cimv2:DISK.ID=\"sda\"", "//host/other:disk.id=\"sda\""}) {
-        EXPECT_EQ(instance, ns->GetInstance(Path(path), none)) << path;
+        EXPECT_EQ(instance, fNamespace->GetInstance(Path(path), kNone)) << path;
     }
-    EXPECT_EQ(instance, ns->FindInstance(instance->GetReference()));
+    EXPECT_EQ(instance, fNamespace->FindInstance(instance->GetReference()));
 }
 
 TEST_F(InMemNamespaceTest, KeysReadFromTextFindEveryType)
@@ -96,8 +97,8 @@ TEST_F(InMemNamespaceTest, KeysReadFromTextFindEveryType)
     } rows[] = {{TType::kBoolean, TCIMValue(true), "TRUE"},
                 {TType::kUint8, TCIMValue(static_cast<unsigned char>(200)), "200"},
                 {TType::kSint16, TCIMValue(static_cast<short>(-5)), "-5"},
-                {TType::kSint64, TCIMValue(std::int64_t(5)), "5"},
-                {TType::kUint64, TCIMValue(~std::uint64_t(0)), "18446744073709551615"},
+                {TType::kSint64, TCIMValue(static_cast<std::int64_t>(5)), "5"},
+                {TType::kUint64, TCIMValue(std::numeric_limits<std::uint64_t>::max()), "18446744073709551615"},
                 {TType::kReal64, TCIMValue(0.5), "0.5"},
                 {TType::kReal32, TCIMValue(2.0F), "2"},
                 {TType::kChar16, TCIMValue(u'x'), "'x'"},
@@ -105,8 +106,8 @@ TEST_F(InMemNamespaceTest, KeysReadFromTextFindEveryType)
     for (const auto& row : rows) {
         const auto cls = Declare("Of" + std::to_string(row.type), nullptr, {{"Key", row.type, {"Key"}}});
         const auto instance = Add(cls, {{"Key", row.value}});
-        EXPECT_EQ(instance, ns->FindInstance(Path(cls->GetName() + ".Key=" + row.key))) << row.key;
-        EXPECT_EQ(instance, ns->FindInstance(Path(instance->GetReference().GetPath()))) << row.key;
+        EXPECT_EQ(instance, fNamespace->FindInstance(Path(cls->GetName() + ".Key=" + row.key))) << row.key;
+        EXPECT_EQ(instance, fNamespace->FindInstance(Path(instance->GetReference().GetPath()))) << row.key;
     }
 }
 
@@ -116,135 +117,143 @@ TEST_F(InMemNamespaceTest, KeysOfDatetimesAndReferencesAreReadToo)
     ASSERT_TRUE(TCIMDateTime::Parse("20200102030405.000000+060", time));
     const auto event = Declare("Event", nullptr, {{"Time", TType::kDateTime, {"Key"}}});
     const auto instance = Add(event, {{"Time", TCIMValue(time)}});
-    EXPECT_EQ(instance, ns->FindInstance(Path("Event.Time=\"20200102020405.000000+000\"")));
+    EXPECT_EQ(instance, fNamespace->FindInstance(Path("Event.Time=\"20200102020405.000000+000\"")));
     const auto link = Allocate("Link", nullptr);
     link->AddPropertyDecl(Reference("To", "Event"));
-    link->AddToNamespace(none);
+    link->AddToNamespace(kNone);
     const auto linked = Add(link, {{"To", TCIMValue(instance->GetReference())}});
-    EXPECT_EQ(linked, ns->FindInstance(Path(linked->GetReference().GetPath())));
+    EXPECT_EQ(linked, fNamespace->FindInstance(Path(linked->GetReference().GetPath())));
 }
 
 TEST_F(InMemNamespaceTest, PathsThatFindNothing)
 {
-    Add(disk, {{"Id", "sda"}});
+    Add(fDisk, {{"Id", "sda"}});
     Declare("Slot", nullptr, {{"Number", TType::kUint8, {"Key"}}});
     const struct {
         const char* path;
         int status;
-    } rows[] = {
-        {"Disk.Id=\"sdb\"", 15}, {"Disk.Id=\"SDA\"", 15}, {"Tape.Id=\"sda\"", 15}, {"Disk.Id=\"sda\",Size=1", 15}, {"Disk", 14},
-        {"Disk.Size=1", 14},     {"Disk.Id=5", 13},       {"Slot.Number=256", 13}, {"Slot.Number=\"x\"", 13}};
+    } rows[] = {{"Disk.Id=\"sdb\"", TZELStatusCode::kNotFound},
+                {"Disk.Id=\"SDA\"", TZELStatusCode::kNotFound},
+                {"Tape.Id=\"sda\"", TZELStatusCode::kNotFound},
+                {"Disk.Id=\"sda\",Size=1", TZELStatusCode::kNotFound},
+                {"Disk", TZELStatusCode::kKeyMissing},
+                {"Disk.Size=1", TZELStatusCode::kKeyMissing},
+                {"Disk.Id=5", TZELStatusCode::kTypeMismatch},
+                {"Slot.Number=256", TZELStatusCode::kTypeMismatch},
+                {"Slot.Number=\"x\"", TZELStatusCode::kTypeMismatch}};
     for (const auto& row : rows) {
-        EXPECT_EQ(row.status, StatusOf([&] { ns->GetInstance(Path(row.path), none); })) << row.path;
-        EXPECT_EQ(row.status, StatusOf([&] { ns->DeleteInstance(Path(row.path), none); })) << row.path;
-        EXPECT_EQ(row.status, StatusOf([&] { ns->ModifyInstance(Path(row.path), none, none); })) << row.path;
+        EXPECT_EQ(row.status, StatusOf([&] { fNamespace->GetInstance(Path(row.path), kNone); })) << row.path;
+        EXPECT_EQ(row.status, StatusOf([&] { fNamespace->DeleteInstance(Path(row.path), kNone); })) << row.path;
+        EXPECT_EQ(row.status, StatusOf([&] { fNamespace->ModifyInstance(Path(row.path), kNone, kNone); })) << row.path;
     }
-    EXPECT_EQ(15, StatusOf([&] { ns->GetInstance(TCIMReference(), none); }));
+    EXPECT_EQ(TZELStatusCode::kNotFound, StatusOf([&] { fNamespace->GetInstance(TCIMReference(), kNone); }));
 }
 
 TEST_F(InMemNamespaceTest, ADeletedInstanceLivesOnInItsHandlesAndMayComeBack)
 {
-    const auto instance = Add(disk, {{"Id", "sda"}});
-    Add(disk, {{"Id", "sdb"}});
-    ns->DeleteInstance(instance->GetReference(), none);
-    EXPECT_EQ("Disk.Id=\"sdb\"\n", InstancesOf(*disk));
-    EXPECT_EQ(15, StatusOf([&] { ns->DeleteInstance(instance->GetReference(), none); }));
+    const auto instance = Add(fDisk, {{"Id", "sda"}});
+    Add(fDisk, {{"Id", "sdb"}});
+    fNamespace->DeleteInstance(instance->GetReference(), kNone);
+    EXPECT_EQ("Disk.Id=\"sdb\"\n", InstancesOf(*fDisk));
+    EXPECT_EQ(TZELStatusCode::kNotFound, StatusOf([&] { fNamespace->DeleteInstance(instance->GetReference(), kNone); }));
     EXPECT_EQ("Id=sda Size=NULL Label=NULL Tags=NULL", ValuesOf(*instance));
-    instance->AddToNamespace(none);
-    EXPECT_EQ("Disk.Id=\"sdb\"\nDisk.Id=\"sda\"\n", InstancesOf(*disk));
+    instance->AddToNamespace(kNone);
+    EXPECT_EQ("Disk.Id=\"sdb\"\nDisk.Id=\"sda\"\n", InstancesOf(*fDisk));
 }
 
 TEST_F(InMemNamespaceTest, ModifyingSetsAllPropertiesOrNone)
 {
-    const auto instance = Add(disk, {{"Id", "sda"}, {"Label", "one"}});
+    const auto instance = Add(fDisk, {{"Id", "sda"}, {"Label", "one"}});
     const TCIMReference path = instance->GetReference();
-    ns->ModifyInstance(path, {{"LABEL", TCIMValue("two")}, {"Size", TCIMValue(std::uint64_t(5))}, {"Id", TCIMValue("sda")}}, none);
+    fNamespace->ModifyInstance(path, {{"LABEL", TCIMValue("two")}, {"Size", Uint64(5)}, {"Id", TCIMValue("sda")}}, kNone);
     EXPECT_EQ("Id=sda Size=5 Label=two Tags=NULL", ValuesOf(*instance));
     const struct {
         TCallContext properties;
         int status;
-    } rows[] = {{{{"Label", TCIMValue("x")}, {"Zone", TCIMValue("x")}}, 15},
-                {{{"Label", TCIMValue("x")}, {"Size", TCIMValue("x")}}, 13},
-                {{{"Id", TCIMValue("sdb")}, {"Label", TCIMValue("x")}}, 5},
-                {{{"Id", TCIMValue()}, {"Label", TCIMValue("x")}}, 5}};
+    } rows[] = {{{{"Label", TCIMValue("x")}, {"Zone", TCIMValue("x")}}, TZELStatusCode::kNotFound},
+                {{{"Label", TCIMValue("x")}, {"Size", TCIMValue("x")}}, TZELStatusCode::kTypeMismatch},
+                {{{"Id", TCIMValue("sdb")}, {"Label", TCIMValue("x")}}, TZELStatusCode::kInvalidParameter},
+                {{{"Id", TCIMValue()}, {"Label", TCIMValue("x")}}, TZELStatusCode::kInvalidParameter}};
     for (const auto& row : rows) {
-        EXPECT_EQ(row.status, StatusOf([&] { ns->ModifyInstance(path, row.properties, none); }));
+        EXPECT_EQ(row.status, StatusOf([&] { fNamespace->ModifyInstance(path, row.properties, kNone); }));
         EXPECT_EQ("Id=sda Size=5 Label=two Tags=NULL", ValuesOf(*instance));
     }
 }
 
-TEST_F(InMemNamespaceTest, ElementLevelChangesTellWhetherAnythingChanged)
+TEST_F(InMemNamespaceTest, ElementLevelChangesReturnWhetherAnythingChanged)
 {
-    const auto instance = Allocate(disk, {{"Id", "sda"}});
-    EXPECT_FALSE(disk->RemoveInstance(instance));
-    EXPECT_TRUE(disk->AddInstance(instance));
-    EXPECT_FALSE(disk->AddInstance(instance));
-    EXPECT_FALSE(disk->AddInstance(Allocate(disk, {{"Id", "sda"}})));
-    EXPECT_EQ(14, StatusOf([&] { disk->AddInstance(Allocate(disk, {})); }));
-    EXPECT_EQ(5, StatusOf([&] { disk->AddInstance(Declare("Tape", nullptr)->AllocateInMemInstance()); }));
-    EXPECT_EQ(5, StatusOf([&] { disk->AddInstance(nullptr); }));
-    EXPECT_TRUE(disk->RemoveInstance(instance));
-    EXPECT_FALSE(disk->RemoveInstance(nullptr));
-    EXPECT_EQ("", InstancesOf(*disk));
+    const auto instance = Allocate(fDisk, {{"Id", "sda"}});
+    EXPECT_FALSE(fDisk->RemoveInstance(instance));
+    EXPECT_TRUE(fDisk->AddInstance(instance));
+    EXPECT_FALSE(fDisk->AddInstance(instance));
+    EXPECT_FALSE(fDisk->AddInstance(Allocate(fDisk, {{"Id", "sda"}})));
+    EXPECT_EQ(TZELStatusCode::kKeyMissing, StatusOf([&] { fDisk->AddInstance(Allocate(fDisk, {})); }));
+    EXPECT_EQ(TZELStatusCode::kInvalidParameter,
+              StatusOf([&] { fDisk->AddInstance(Declare("Tape", nullptr)->AllocateInMemInstance()); }));
+    EXPECT_EQ(TZELStatusCode::kInvalidParameter, StatusOf([&] { fDisk->AddInstance(nullptr); }));
+    EXPECT_TRUE(fDisk->RemoveInstance(instance));
+    EXPECT_FALSE(fDisk->RemoveInstance(nullptr));
+    EXPECT_EQ("", InstancesOf(*fDisk));
 }
 
 TEST_F(InMemNamespaceTest, ClearedOfInstancesItKeepsItsClasses)
 {
-    const auto instance = Add(disk, {{"Id", "sda"}});
-    ns->ClearInstances();
-    EXPECT_EQ("", InstancesOf(*disk));
+    const auto instance = Add(fDisk, {{"Id", "sda"}});
+    fNamespace->ClearInstances();
+    EXPECT_EQ("", InstancesOf(*fDisk));
     EXPECT_FALSE(instance->IsAdded());
-    Add(disk, {{"Id", "sda"}});
-    EXPECT_EQ("Disk.Id=\"sda\"\n", InstancesOf(*disk));
+    Add(fDisk, {{"Id", "sda"}});
+    EXPECT_EQ("Disk.Id=\"sda\"\n", InstancesOf(*fDisk));
 }
 
 TEST_F(InMemNamespaceTest, ThousandsComeAndGoInConstantTime)
 {
     for (int number = 0; number < 20000; ++number) {
-        Add(disk, {{"Id", TCIMValue(std::to_string(number))}});
+        Add(fDisk, {{"Id", TCIMValue(std::to_string(number))}});
         if (number >= 10) {
-            ns->DeleteInstance(Path("Disk.Id=\"" + std::to_string(number - 10) + "\""), none);
+            fNamespace->DeleteInstance(Path("Disk.Id=\"" + std::to_string(number - 10) + "\""), kNone);
         }
     }
-    EXPECT_EQ(10U, disk->GetInstanceCount());
-    EXPECT_EQ("Disk.Id=\"19990\"\n", InstancesOf(*disk).substr(0, 16));
-    EXPECT_NE(nullptr, ns->FindInstance(Path("Disk.Id=\"19995\"")));
+    EXPECT_EQ(10U, fDisk->GetInstanceCount());
+    EXPECT_EQ("Disk.Id=\"19990\"\n", InstancesOf(*fDisk).substr(0, 16));
+    EXPECT_NE(nullptr, fNamespace->FindInstance(Path("Disk.Id=\"19995\"")));
 }
 
 TEST_F(InMemNamespaceTest, QualifiersAreDeclaredOnce)
 {
     const auto declare = [&](const char* name) {
-        return ns->AllocateQualifierDecl(name, TCIMValue(false), ICIMQualifierDecl::kScopeProperty,
-                                         ICIMQualifierDecl::kFlavorDefault, none);
+        return fNamespace->AllocateQualifierDecl(name, TCIMValue(false), ICIMQualifierDecl::kScopeProperty,
+                                                 ICIMQualifierDecl::kFlavorDefault, kNone);
     };
     declare("Key");
     const auto units = declare("Units");
-    EXPECT_EQ(12, StatusOf([&] { declare("KEY"); }));
-    EXPECT_EQ(5, StatusOf([&] { declare(""); }));
-    EXPECT_EQ(units, ns->GetQualifierDecl("units", none));
-    EXPECT_EQ(TCIMValue(false), units->GetValue(none));
-    EXPECT_EQ(ICIMQualifierDecl::kScopeProperty, units->GetScope(none));
-    EXPECT_EQ(ICIMQualifierDecl::kFlavorDefault, units->GetFlavor(none));
-    EXPECT_EQ(15, StatusOf([&] { ns->GetQualifierDecl("Max", none); }));
-    EXPECT_EQ("Key Units", NamesOf<ICIMQualifierDecl>([&](const auto& callback) { ns->EnumerateQualifierDecls(callback, none); }));
+    EXPECT_EQ(TZELStatusCode::kAlreadyExists, StatusOf([&] { declare("KEY"); }));
+    EXPECT_EQ(TZELStatusCode::kInvalidParameter, StatusOf([&] { declare(""); }));
+    EXPECT_EQ(units, fNamespace->GetQualifierDecl("units", kNone));
+    EXPECT_EQ(TCIMValue(false), units->GetValue(kNone));
+    EXPECT_EQ(ICIMQualifierDecl::kScopeProperty, units->GetScope(kNone));
+    EXPECT_EQ(ICIMQualifierDecl::kFlavorDefault, units->GetFlavor(kNone));
+    EXPECT_EQ(TZELStatusCode::kNotFound, StatusOf([&] { fNamespace->GetQualifierDecl("Max", kNone); }));
+    EXPECT_EQ("Key Units",
+              NamesOf<ICIMQualifierDecl>([&](const auto& callback) { fNamespace->EnumerateQualifierDecls(callback, kNone); }));
 }
 
 TEST_F(InMemNamespaceTest, WhatIsNotOfferedIsRefused)
 {
-    EXPECT_EQ(31, StatusOf([&] { ns->SetUpcallNamespace(nullptr, none); }));
-    EXPECT_EQ(31, StatusOf([&] { ns->AddUnderlyingNamespace(nullptr, none); }));
-    EXPECT_EQ(1, StatusOf([&] {
-                  ns->Subscribe(
-                      nullptr, [](boost::shared_ptr<ICIMInstance>) { return true; }, none);
+    EXPECT_EQ(TZELStatusCode::kNotSupported, StatusOf([&] { fNamespace->SetUpcallNamespace(nullptr, kNone); }));
+    EXPECT_EQ(TZELStatusCode::kNotSupported, StatusOf([&] { fNamespace->AddUnderlyingNamespace(nullptr, kNone); }));
+    EXPECT_EQ(TZELStatusCode::kNotOffered, StatusOf([&] {
+                  fNamespace->Subscribe(
+                      nullptr, [](boost::shared_ptr<ICIMInstance>) { return true; }, kNone);
               }));
     int providers = 0;
-    ns->EnumerateProviders([&](boost::shared_ptr<IProvider>) { return ++providers > 0; }, none);
+    fNamespace->EnumerateProviders([&](boost::shared_ptr<IProvider>) { return ++providers > 0; }, kNone);
     EXPECT_EQ(0, providers);
     const auto other = TInMemNamespace::Create("other");
-    ICIMNamespace& target = *ns;
+    ICIMNamespace& target = *fNamespace;
     EXPECT_EQ(&target, &(target = *other));
-    EXPECT_EQ("root/cimv2", ns->GetNamespaceName());
-    EXPECT_EQ("Disk", NamesOf<ICIMClass>([&](const auto& callback) { ns->EnumerateRootClasses(callback, none); }));
+    EXPECT_EQ("root/cimv2", fNamespace->GetNamespaceName());
+    EXPECT_EQ("Disk", NamesOf<ICIMClass>([&](const auto& callback) { fNamespace->EnumerateRootClasses(callback, kNone); }));
 }
 
 }  // namespace

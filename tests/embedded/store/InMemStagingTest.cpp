@@ -1,6 +1,6 @@
 #include "embedded/store/TInMemStaging.h"
 
-#include "tests/embedded/store/InMemFixture.h"
+#include "tests/embedded/store/TInMemFixture.h"
 
 namespace NORVZEL20 {
 namespace {
@@ -9,9 +9,10 @@ class InMemStagingTest : public TInMemFixture {
   protected:
     std::string Contents()
     {
-        std::string text = NamesOf<ICIMQualifierDecl>([&](const auto& callback) { ns->EnumerateQualifierDecls(callback, none); });
-        return text + "|" + SubClassesOf(*ns->GetClass("<root>", none), true) + "|" +
-               InstancesOf(*ns->GetClass("<root>", none), true);
+        std::string text =
+            NamesOf<ICIMQualifierDecl>([&](const auto& callback) { fNamespace->EnumerateQualifierDecls(callback, kNone); });
+        return text + "|" + SubClassesOf(*fNamespace->GetClass("<root>", kNone), true) + "|" +
+               InstancesOf(*fNamespace->GetClass("<root>", kNone), true);
     }
 
     void Fill(TInMemStaging& staging)
@@ -21,21 +22,21 @@ class InMemStagingTest : public TInMemFixture {
         const auto tape = Allocate("Tape", nullptr, {{"Id", TType::kString, {"Key"}}});
         staging.AddClass(tape);
         staging.AddClass(Allocate("SmallTape", tape));
-        staging.AddInstance(Allocate(disk, {{"Id", "sdb"}}));
+        staging.AddInstance(Allocate(fDisk, {{"Id", "sdb"}}));
         staging.AddInstance(Allocate(tape, {{"Id", "t0"}}));
-        staging.AddInstance(Allocate(disk, {{"Id", "sdc"}}));
-        staging.AddInstance(Allocate(record, {}));
+        staging.AddInstance(Allocate(fDisk, {{"Id", "sdc"}}));
+        staging.AddInstance(Allocate(fRecord, {}));
     }
 
-    TClassPointer disk = DeclareDisk();
-    TClassPointer record = Declare("Record", nullptr, {{"Number", TType::kUint64, {"Key", "Generated"}}});
-    TInstancePointer first = Add(disk, {{"Id", "sda"}});
+    TClassPointer fDisk = DeclareDisk();
+    TClassPointer fRecord = Declare("Record", nullptr, {{"Number", TType::kUint64, {"Key", "Generated"}}});
+    TInstancePointer fFirst = Add(fDisk, {{"Id", "sda"}});
 };
 
 TEST_F(InMemStagingTest, CommittedEverythingStays)
 {
     {
-        TInMemStaging staging(ns);
+        TInMemStaging staging(fNamespace);
         Fill(staging);
         staging.Commit();
     }
@@ -47,66 +48,66 @@ TEST_F(InMemStagingTest, OtherwiseTheNamespaceIsAsItWas)
 {
     const std::string before = Contents();
     {
-        TInMemStaging staging(ns);
+        TInMemStaging staging(fNamespace);
         Fill(staging);
         EXPECT_NE(before, Contents());
     }
     EXPECT_EQ(before, Contents());
-    EXPECT_EQ(15, StatusOf([&] { ns->GetClass("Tape", none); }));
-    EXPECT_EQ(nullptr, ns->FindInstance(Path("Disk.Id=\"sdb\"")));
-    EXPECT_EQ(first, ns->FindInstance(Path("Disk.Id=\"sda\"")));
-    Add(record, {});
-    EXPECT_EQ("Record.Number=1\n", InstancesOf(*record));
+    EXPECT_EQ(TZELStatusCode::kNotFound, StatusOf([&] { fNamespace->GetClass("Tape", kNone); }));
+    EXPECT_EQ(nullptr, fNamespace->FindInstance(Path("Disk.Id=\"sdb\"")));
+    EXPECT_EQ(fFirst, fNamespace->FindInstance(Path("Disk.Id=\"sda\"")));
+    Add(fRecord, {});
+    EXPECT_EQ("Record.Number=1\n", InstancesOf(*fRecord));
 }
 
 TEST_F(InMemStagingTest, WhatWasTakenBackMayBeStagedAgain)
 {
     {
-        TInMemStaging staging(ns);
+        TInMemStaging staging(fNamespace);
         Fill(staging);
     }
-    TInMemStaging staging(ns);
+    TInMemStaging staging(fNamespace);
     Fill(staging);
     staging.Commit();
-    EXPECT_EQ(3U, disk->GetInstanceCount());
+    EXPECT_EQ(3U, fDisk->GetInstanceCount());
 }
 
 TEST_F(InMemStagingTest, StaticValuesAreAsTheyWereToo)
 {
-    disk->AddPropertyDecl(Decl({"Firmware", TType::kString, {"Static"}}));
-    const auto firmware = disk->GetProperty("Firmware", none);
-    firmware->SetValue(TCIMValue("old"), none);
+    fDisk->AddPropertyDecl(Decl({"Firmware", TType::kString, {"Static"}}));
+    const auto firmware = fDisk->GetProperty("Firmware", kNone);
+    firmware->SetValue(TCIMValue("old"), kNone);
     {
-        TInMemStaging staging(ns);
-        staging.KeepStaticValues(*disk);
-        Allocate(disk, {{"Id", "sdb"}, {"Firmware", "newer"}});
-        staging.KeepStaticValues(*disk);
+        TInMemStaging staging(fNamespace);
+        staging.KeepStaticValues(*fDisk);
+        Allocate(fDisk, {{"Id", "sdb"}, {"Firmware", "newer"}});
+        staging.KeepStaticValues(*fDisk);
         firmware->MarkChanged(TCIMValue("newest"));
     }
-    EXPECT_EQ("old", firmware->GetValue(none).ToText());
+    EXPECT_EQ("old", firmware->GetValue(kNone).ToText());
     EXPECT_FALSE(dynamic_cast<const TInMemStaticProperty&>(*firmware).IsChanged());
     {
-        TInMemStaging staging(ns);
-        staging.KeepStaticValues(*disk);
-        Allocate(disk, {{"Id", "sdb"}, {"Firmware", "new"}});
+        TInMemStaging staging(fNamespace);
+        staging.KeepStaticValues(*fDisk);
+        Allocate(fDisk, {{"Id", "sdb"}, {"Firmware", "new"}});
         staging.Commit();
     }
-    EXPECT_EQ("new", firmware->GetValue(none).ToText());
+    EXPECT_EQ("new", firmware->GetValue(kNone).ToText());
 }
 
 TEST_F(InMemStagingTest, RefusesWhatIsThereAndGoesOn)
 {
-    TInMemStaging staging(ns);
-    const auto same = Allocate(disk, {{"Id", "sda"}});
-    EXPECT_EQ(12, StatusOf([&] { staging.AddInstance(same); }));
+    TInMemStaging staging(fNamespace);
+    const auto same = Allocate(fDisk, {{"Id", "sda"}});
+    EXPECT_EQ(TZELStatusCode::kAlreadyExists, StatusOf([&] { staging.AddInstance(same); }));
     EXPECT_EQ("root/cimv2:Disk.Id=\"sda\"", same->GetReference().GetPath());
-    staging.AddInstance(Allocate(disk, {{"Id", "sdb"}}));
-    EXPECT_EQ(12, StatusOf([&] { staging.AddInstance(Allocate(disk, {{"Id", "sdb"}})); }));
-    EXPECT_EQ(14, StatusOf([&] { staging.AddInstance(Allocate(disk, {})); }));
-    EXPECT_EQ(12, StatusOf([&] { staging.AddClass(Allocate("disk", nullptr)); }));
+    staging.AddInstance(Allocate(fDisk, {{"Id", "sdb"}}));
+    EXPECT_EQ(TZELStatusCode::kAlreadyExists, StatusOf([&] { staging.AddInstance(Allocate(fDisk, {{"Id", "sdb"}})); }));
+    EXPECT_EQ(TZELStatusCode::kKeyMissing, StatusOf([&] { staging.AddInstance(Allocate(fDisk, {})); }));
+    EXPECT_EQ(TZELStatusCode::kAlreadyExists, StatusOf([&] { staging.AddClass(Allocate("disk", nullptr)); }));
     const auto undeclared = Allocate("Tape", nullptr);
-    EXPECT_EQ(15, StatusOf([&] { staging.AddClass(Allocate("SmallTape", undeclared)); }));
-    EXPECT_EQ(15, StatusOf([&] { staging.AddInstance(undeclared->AllocateInMemInstance()); }));
+    EXPECT_EQ(TZELStatusCode::kNotFound, StatusOf([&] { staging.AddClass(Allocate("SmallTape", undeclared)); }));
+    EXPECT_EQ(TZELStatusCode::kNotFound, StatusOf([&] { staging.AddInstance(undeclared->AllocateInMemInstance()); }));
     staging.Commit();
     EXPECT_EQ("|Disk Record|Disk.Id=\"sda\"\nDisk.Id=\"sdb\"\n", Contents());
 }

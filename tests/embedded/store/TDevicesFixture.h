@@ -1,6 +1,6 @@
 #pragma once
 
-#include "tests/embedded/store/InMemFixture.h"
+#include "tests/embedded/store/TInMemFixture.h"
 
 namespace NORVZEL20 {
 
@@ -9,16 +9,16 @@ class TDevicesFixture : public TInMemFixture {
   protected:
     TDevicesFixture()
     {
-        device = Declare("Device", nullptr, {{"Id", TType::kString, {"Key"}}});
-        disk = Declare("Disk", device, {{"Size", TType::kUint64, {}}});
-        solidState = Declare("SolidState", disk, {{"Wear", TType::kUint8, {}}});
-        fan = Declare("Fan", device, {{"Speed", TType::kUint32, {}}});
-        room = Declare("Room", nullptr, {{"Name", TType::kString, {"Key"}}});
+        fDevice = Declare("Device", nullptr, {{"Id", TType::kString, {"Key"}}});
+        fDisk = Declare("Disk", fDevice, {{"Size", TType::kUint64, {}}});
+        fSolidState = Declare("SolidState", fDisk, {{"Wear", TType::kUint8, {}}});
+        fFan = Declare("Fan", fDevice, {{"Speed", TType::kUint32, {}}});
+        fRoom = Declare("Room", nullptr, {{"Name", TType::kString, {"Key"}}});
     }
 
-    boost::shared_ptr<ICIMClass> Root() { return ns->GetClass("<root>", none); }
+    boost::shared_ptr<ICIMClass> Root() { return fNamespace->GetClass("<root>", kNone); }
 
-    TClassPointer device, disk, solidState, fan, room;
+    TClassPointer fDevice, fDisk, fSolidState, fFan, fRoom;
 };
 
 }  // namespace NORVZEL20

@@ -3,17 +3,18 @@
 #include <gtest/gtest.h>
 
 #include <boost/smart_ptr/make_shared.hpp>
+#include <cstdint>
 #include <initializer_list>
 #include <string>
 #include <vector>
 
 #include "embedded/store/TInMemNamespace.h"
 #include "embedded/store/TInMemQualifier.h"
-#include "host/TZELException.h"
+#include "tests/support/StatusOf.h"
 
 namespace NORVZEL20 {
 
-/// A namespace "root/cimv2" and verbs to fill and to tell it.
+/// A namespace "root/cimv2", verbs to fill it, and texts that describe what is in it.
 class TInMemFixture : public testing::Test {
   protected:
     using TType = TCIMValue::TCIMType;
@@ -52,7 +53,7 @@ class TInMemFixture : public testing::Test {
     TClassPointer Allocate(const std::string& name, const TClassPointer& superClass,
                            std::initializer_list<TProperty> properties = {})
     {
-        auto cls = ns->AllocateInMemClass(name, superClass);
+        auto cls = fNamespace->AllocateInMemClass(name, superClass);
         for (const TProperty& property : properties) {
             cls->AddPropertyDecl(Decl(property));
         }
@@ -63,7 +64,7 @@ class TInMemFixture : public testing::Test {
                           std::initializer_list<TProperty> properties = {})
     {
         auto cls = Allocate(name, superClass, properties);
-        cls->AddToNamespace(none);
+        cls->AddToNamespace(kNone);
         return cls;
     }
 
@@ -93,30 +94,20 @@ class TInMemFixture : public testing::Test {
         return instance;
     }
 
+    static TCIMValue Uint64(std::uint64_t number) { return TCIMValue(number); }
+
     static TCIMValue Texts(std::initializer_list<const char*> texts)
     {
         std::vector<TCIMValue> elements;
         for (const char* const text : texts) {
             elements.emplace_back(text);
         }
-        return TCIMValue(TType::kString, unsigned(elements.size()), elements);
+        return TCIMValue(TType::kString, static_cast<unsigned>(elements.size()), elements);
     }
 
-    TCIMReference Path(const std::string& text) const { return TCIMReference::Parse(text, ns); }
+    TCIMReference Path(const std::string& text) const { return TCIMReference::Parse(text, fNamespace); }
 
-    /// The status that `act` throws; 0 where it throws none.
-    template <class TAct>
-    static int StatusOf(TAct&& act)
-    {
-        try {
-            act();
-        } catch (const TZELException& failure) {
-            return failure.GetStatusCode().GetStatus();
-        }
-        return 0;
-    }
-
-    /// The names that an enumeration of `names(callback)` gives, with blanks between.
+    /// The names of the elements that `enumerate(callback)` delivers, with blanks between.
     template <class TElement, class TEnumerate>
     static std::string NamesOf(TEnumerate&& enumerate)
     {
@@ -184,8 +175,8 @@ class TInMemFixture : public testing::Test {
         return values;
     }
 
-    const TCallContext none;
-    boost::shared_ptr<TInMemNamespace> ns = TInMemNamespace::Create("root/cimv2");
+    const TCallContext kNone;
+    boost::shared_ptr<TInMemNamespace> fNamespace = TInMemNamespace::Create("root/cimv2");
 };
 
 }  // namespace NORVZEL20
