@@ -2,8 +2,7 @@
 //
 // An entry has a home, computed from its hash. If another entry is there, it goes to the next free place behind. A search starts at
 // the home and ends at the first free place, so there must be no free place between an entry and its home. Removing an entry would
-// leave one: the entries that follow are therefore moved up where they may. The table doubles when more than four fifths are in
-// use.
+// leave one: the entries that follow are therefore moved up where they may. The table doubles when over four fifths are in use.
 
 #include "embedded/store/THashIndex.h"
 

@@ -20,8 +20,8 @@ class TInMemBlock {
 
     /// How many bytes a block of `count` properties takes.
     static std::size_t GetSize(std::uint32_t count) noexcept;
-    /// Makes a block in `memory`, which has GetSize(count) bytes: one property for each slot of `layout` from `first` on, each
-    /// null.
+    /// Makes a block in `memory`, which has GetSize(count) bytes: a property that is null for each of `count` slots
+    /// of `layout` from `first` on.
     static TInMemBlock& Make(void* memory, TInMemInstance& owner, const TInMemLayout& layout, std::uint32_t first,
                              std::uint32_t count) noexcept;
     /// Destroys the block and its `count` properties.

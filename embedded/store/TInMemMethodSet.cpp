@@ -1,6 +1,6 @@
 // Methods are few and rarely asked for, so inherited ones are not copied into the subclass: a search goes up from set to set. Each
-// own method remembers the one that it overrides. A method that overrides none is the first of its name; these give the order of
-// GetAll.
+// own method remembers the one that it overrides. One that overrides none is the first of its name; GetAll lists them in their
+// order.
 
 #include "embedded/store/TInMemMethodSet.h"
 

@@ -45,8 +45,7 @@ class CIMDELTA_EXPORT TInMemPropertyDecl : public TInMemNamedElement<ICIMPropert
     /// Whether a null is replaced by the next number of the class when an instance is added: a uint64 key with Generated(true).
     bool IsGenerated() const noexcept { return fGenerated; }
 
-    /// The value as the property holds it: nulls typed, bags marked. Errors: kTypeMismatch (13) if the type is not the declared
-    /// one.
+    /// The value as the property holds it: nulls typed, bags marked. Errors: kTypeMismatch (13) if the types differ.
     TCIMValue Fit(TCIMValue value) const;
 
     /// The value with a stub in the place of each class that a reference in it holds. A class owns its declarations; if a value in

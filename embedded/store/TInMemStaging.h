@@ -14,7 +14,8 @@ namespace NORVZEL20 {
 ///
 /// What is added is visible at once. Unless Commit is called, the destructor takes everything out again, and the namespace is as it
 /// was, generated numbers included. While a staging is open, remove nothing and change no class that was there before; static
-/// values may change if KeepStaticValues was called first. Threads: as the namespace.
+/// values may change if KeepStaticValues was called first.
+/// Threads: as the namespace.
 class CIMDELTA_INTERNAL_EXPORT TInMemStaging {
   public:
     /// `ns` must not be null.
