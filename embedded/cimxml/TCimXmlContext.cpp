@@ -1,12 +1,22 @@
+// One document, one namespace.
+//
+// A document may name its namespace several times: in each group, and in the name in front of each object. The first name counts,
+// and any other is an error, because objects of two namespaces would fall together in one. The same holds for the host. A document
+// that names none has the default of TLoadReport, so that references to that default count as its own.
 #include "embedded/cimxml/TCimXmlContext.h"
 
 #include <algorithm>
+#include <utility>
 
 #include "embedded/cimxml/MessageText.h"
 #include "embedded/cimxml/TXmlReader.h"
 #include "embedded/value/TNameText.h"
 
 namespace NORVZEL20 {
+
+TCimXmlContext::TCimXmlContext(std::string file) : fFile(std::move(file)) {}
+
+TCimXmlContext::~TCimXmlContext() = default;
 
 void TCimXmlContext::Fail(TZELStatusCode::EStatusCode status, const std::string& message) const
 {
@@ -31,6 +41,7 @@ TCimXmlContext::TPlace TCimXmlContext::GetPlace() const
 
 void TCimXmlContext::Tolerate(const char* kind, const std::string& text)
 {
+    // Kinds are string literals, one for each caller, so comparing pointers is enough.
     const auto known = std::find(fKinds.begin(), fKinds.end(), kind);
     if (known != fKinds.end()) {
         ++fReport.tolerated[static_cast<std::size_t>(known - fKinds.begin())].count;

@@ -42,7 +42,8 @@ class CIMDELTA_INTERNAL_EXPORT TCimXmlContext {
     };
 
     /// `file` is what messages call the document.
-    explicit TCimXmlContext(std::string file) : fFile(std::move(file)) {}
+    explicit TCimXmlContext(std::string file);
+    ~TCimXmlContext();
 
     /// Sets the XML reader that knows the place; to be called before the load begins. The reader must outlive the load.
     void SetReader(const TXmlReader& reader) noexcept { fReader = &reader; }

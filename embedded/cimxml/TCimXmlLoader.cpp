@@ -11,6 +11,7 @@
 #include "embedded/cimxml/TCimXmlLoader.h"
 
 #include <boost/smart_ptr/make_shared.hpp>
+#include <utility>
 
 #include "embedded/cimxml/MessageText.h"
 
@@ -22,6 +23,8 @@ TCimXmlLoader::TCimXmlLoader(TCimXmlContext& context, const boost::shared_ptr<TI
     : fContext(context), fNamespace(ns), fStaging(ns), fClasses(context, *ns, fStaging),
       fBuilder(context, *ns, fStaging, fClasses, fLate)
 {}
+
+TCimXmlLoader::~TCimXmlLoader() = default;
 
 void TCimXmlLoader::AddQualifierDecl(const TCimXmlQualifierDraft& draft)
 {
@@ -36,6 +39,11 @@ void TCimXmlLoader::AddQualifierDecl(const TCimXmlQualifierDraft& draft)
                                                    " that differs from the first in type or value; remove one");
     }
     fContext.Tolerate("repeated qualifier", "qualifier " + Quote(draft.name) + " is declared again; the first declaration stands");
+}
+
+void TCimXmlLoader::AddClass(TCimXmlDraft draft)
+{
+    fClasses.Add(std::move(draft));
 }
 
 bool TCimXmlLoader::BeginInstance(const char* className)
@@ -70,6 +78,7 @@ void TCimXmlLoader::Add(const boost::shared_ptr<TInMemInstance>& instance)
     }
 }
 
+/// The namespace reports only a status; the message has to name the key or the path.
 void TCimXmlLoader::Explain(const TZELException& error, const TInMemInstance& instance) const
 {
     const EStatus status = error.GetStatusCode().GetStatus();

@@ -29,11 +29,12 @@ class CIMDELTA_INTERNAL_EXPORT TCimXmlLoader {
 
     /// `context` must outlive the loader; `ns` must not be null.
     TCimXmlLoader(TCimXmlContext& context, const boost::shared_ptr<TInMemNamespace>& ns);
+    ~TCimXmlLoader();
 
     /// A repeated declaration is tolerated if it has the same type and value. Errors: kAlreadyExists (12) if it has not.
     void AddQualifierDecl(const TCimXmlQualifierDraft& draft);
     /// See TCimXmlClassQueue::Add.
-    void AddClass(TCimXmlDraft draft) { fClasses.Add(std::move(draft)); }
+    void AddClass(TCimXmlDraft draft);
 
     /// Starts an instance. If it returns false, read the instance as a draft and call AddInstance; otherwise call FindProperty and
     /// SetProperty for each of its properties (see TCimXmlInstanceBuilder), then EndInstance.
