@@ -67,9 +67,8 @@ TInMemExtent& TInMemClass::GetExtent() const
 
 void TInMemClass::Enter(TInMemClass& parent, TInMemExtent& extent)
 {
-    if (fLayout.CatchUp()) {
-        fMethods.InheritAll();
-    }
+    fLayout.CatchUp();
+    fMethods.InheritAll();
     parent.fSubClasses.push_back(weak_from_this());  // the last step that may fail
     fExtent = &extent;
 }

@@ -35,17 +35,20 @@ boost::shared_ptr<TInMemPropertyDecl> TInMemLayout::FindDecl(std::string_view na
     return slot == kNoSlot ? nullptr : fSlots[slot];
 }
 
-bool TInMemLayout::CatchUp()
+void TInMemLayout::CatchUp()
 {
     if (!fSuper || fSuper->fVersion == fSuperVersion) {
-        return false;
+        return;
+    }
+    // What is here may be gone above, and what is above may be new here.
+    for (std::uint32_t slot = 0; slot < GetSlotCount(); ++slot) {
+        Resolve(fSlots[slot]->GetName());
     }
     for (const std::uint32_t slot : fSuper->fOrder) {
         Resolve(fSuper->fSlots[slot]->GetName());
     }
     fSuperVersion = fSuper->fVersion;
     Rearrange();
-    return true;
 }
 
 void TInMemLayout::Reserve()
@@ -121,12 +124,12 @@ void TInMemLayout::Resolve(std::string_view name)
     }
     const auto& decl = own ? own : inherited;
     const std::uint32_t slot = FindSlot(name);
-    if (!decl) {
-        fSlotIndex.Remove(TNameText::Hash(name), slot);
-    } else if (slot != kNoSlot) {
-        fSlots[slot] = decl;
-    } else {
+    if (decl && slot == kNoSlot) {
         Append(decl);
+    } else if (decl) {
+        fSlots[slot] = decl;
+    } else if (slot != kNoSlot) {
+        fSlotIndex.Remove(TNameText::Hash(name), slot);
     }
 }
 

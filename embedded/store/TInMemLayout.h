@@ -43,9 +43,9 @@ class CIMDELTA_EXPORT TInMemLayout {
     /// The declaration that counts for this class, its own or an inherited one; null if there is none.
     boost::shared_ptr<TInMemPropertyDecl> FindDecl(std::string_view name) const;
 
-    /// Takes over what the superclass has got since the last time; for a class that was not declared meanwhile. Returns whether
-    /// there was anything. Errors: std::bad_alloc.
-    bool CatchUp();
+    /// Takes over what has changed in the superclass since the last time; for a class that was not declared meanwhile. Errors:
+    /// std::bad_alloc.
+    void CatchUp();
     /// Makes room for one more property, which may be a key.
     void Reserve();
     /// Adds a declaration to this class. One of that name that is inherited is overridden by it and keeps its place. Call Reserve

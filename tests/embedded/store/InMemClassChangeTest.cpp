@@ -38,6 +38,27 @@ TEST_F(InMemClassChangeTest, ASubclassThatIsDeclaredLateHasWhatItsSuperclassGotM
     EXPECT_EQ("Id Serial Length", PropertiesOf(*tape));
 }
 
+TEST_F(InMemClassChangeTest, ASubclassThatIsDeclaredLateHasNotWhatItsSuperclassLostMeanwhile)
+{
+    const auto tape = Allocate("Tape", fDisk, {{"Length", TType::kUint32, {}}, {"SIZE", TType::kUint64, {}}});
+    const auto reel = Allocate("Reel", fDisk, {{"Width", TType::kUint32, {}}});
+    fDisk->RemovePropertyDecl(fDisk->GetPropertyDecl("Size", kNone));
+    tape->AddToNamespace(kNone);
+    reel->AddToNamespace(kNone);
+    EXPECT_EQ("Id Length SIZE", PropertiesOf(*tape));
+    EXPECT_EQ("Id Width", PropertiesOf(*reel));
+    EXPECT_EQ(nullptr, reel->FindPropertyDecl("Size"));
+}
+
+TEST_F(InMemClassChangeTest, AMethodOfASubclassThatIsDeclaredLateOverridesOneThatIsNewAbove)
+{
+    const auto tape = Allocate("Tape", fDevice);
+    tape->AddMethodDecl(tape->AllocateMethodDecl("Reset", TType::kUint32, kNone));
+    fDevice->AddMethodDecl(fDevice->AllocateMethodDecl("Reset", TType::kUint32, kNone));
+    tape->AddToNamespace(kNone);
+    EXPECT_EQ("Reset", NamesOf<ICIMMethodDecl>([&](const auto& callback) { tape->EnumerateMethodDecls(callback, kNone); }));
+}
+
 TEST_F(InMemClassChangeTest, AnOverrideKeepsItsPlaceAndInheritsTheKey)
 {
     const auto tape = Allocate("Tape", fDevice, {{"Length", TType::kUint32, {}}, {"ID", TType::kString, {"Upper"}}});
