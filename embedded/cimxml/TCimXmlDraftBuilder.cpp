@@ -109,6 +109,7 @@ void TCimXmlDraftBuilder::EndParameter()
     fParameter.reset();
 }
 
+/// Innermost first: a parameter is open inside of a method, and a property or a method inside of the class.
 void TCimXmlDraftBuilder::AddQualifier(TEmbeddedObject::TQualifier qualifier)
 {
     const auto& there = fParameter  ? fParameter->qualifiers
@@ -127,6 +128,7 @@ void TCimXmlDraftBuilder::AddQualifier(TEmbeddedObject::TQualifier qualifier)
     }
 }
 
+/// 0 for an array without a fixed size, and for what is no array.
 unsigned int TCimXmlDraftBuilder::ReadArraySize(const TCimXmlAttributes& attributes) const
 {
     const char* text = attributes.Find("ARRAYSIZE");

@@ -1,3 +1,7 @@
+// From the name of an element to its number.
+//
+// This happens for every tag, so the names are in a hash table that the compiler builds. The hash takes the length and three
+// characters: the names differ in these almost always, and one comparison of the whole name settles the rest.
 #include "embedded/cimxml/TCimXmlElement.h"
 
 #include <array>
@@ -10,6 +14,7 @@ namespace {
 
 using E = TCimXmlElement;
 
+// In the order of EElement.
 constexpr std::array<std::string_view, E::kCount> kNames = {"",
                                                             "CIM",
                                                             "CLASS",

@@ -27,6 +27,7 @@ bool TCimXmlInstanceBuilder::Begin(const char* className)
     return true;
 }
 
+/// Static properties have one value for all instances, so it is saved before the first instance changes it.
 TCimXmlLayout* TCimXmlInstanceBuilder::FindLayout(const char* className)
 {
     if (fLayout != nullptr && fLayout->cls->GetName() == className) {
@@ -80,6 +81,7 @@ void TCimXmlInstanceBuilder::SetProperty(const TCimXmlTarget& target, TCIMValue&
     fLayout->isHeld = fLayout->isHeld || fLayout->cls->GetLayout().GetDecl(target.slot).IsKey();
 }
 
+/// Writers do not always use the declared type: another one is accepted if the declared type can hold the value exactly.
 TCIMValue TCimXmlInstanceBuilder::Convert(const TCimXmlTarget& target, const TCIMValue& value)
 {
     const std::string& className = fLayout->cls->GetName();

@@ -1,3 +1,8 @@
+// Classes and properties, copied out of a namespace.
+//
+// A class of this host knows which properties, methods and qualifiers are its own and which it inherits. The interfaces of the host
+// do not show that difference, nor parameters, array sizes and classes of references. So the functions below look whether an object
+// is one of this host (`inMemory` is not null) and then ask it directly; for any other they copy what the interfaces show.
 #include "embedded/cimxml/TCimXmlObjects.h"
 
 #include <type_traits>
@@ -66,6 +71,7 @@ TEmbeddedObject::TMethod FromMethodDecl(const ICIMMethodDecl& decl)
     return method;
 }
 
+/// For a class of this host.
 void AddOwnElements(TEmbeddedObject& object, const TInMemClass& cls)
 {
     for (const boost::shared_ptr<TInMemPropertyDecl>& decl : cls.GetLayout().GetOwnDecls()) {
@@ -76,6 +82,7 @@ void AddOwnElements(TEmbeddedObject& object, const TInMemClass& cls)
     }
 }
 
+/// For a class of another host.
 void AddAllElements(TEmbeddedObject& object, const ICIMClass& cls)
 {
     const auto addProperty = [&](const boost::shared_ptr<ICIMPropertyDecl>& decl) {
@@ -154,7 +161,7 @@ TEmbeddedObject::TProperty TCimXmlObjects::FromProperty(const ICIMProperty& prop
         result.referenceClass = inMemory->GetReferenceClass();
         result.arraySize = inMemory->GetArraySize();
     }
-    if (result.value.IsNull()) {
+    if (result.value.IsNull()) {  // null values are written with the declared type
         result.value = TCIMValue::Null(decl->GetType(TCallContext()));
     }
     return result;

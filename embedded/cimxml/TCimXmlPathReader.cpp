@@ -51,7 +51,7 @@ void TCimXmlPathReader::Begin()
     if (++fDepth > kMaxDepth) {
         FailTooDeep();
     }
-    if (fDepth > fFrames.size()) {
+    if (fDepth > fFrames.size()) {  // frames are reused, because their strings and vectors keep their memory
         fFrames.emplace_back();
     }
     TFrame& frame = fFrames[fDepth - 1];
@@ -90,7 +90,7 @@ TCIMReference TCimXmlPathReader::End()
         }
         AddKeyTo(path, name, adapted);
     }
-    if (path.GetKeyCount() < frame.keys.size()) {
+    if (path.GetKeyCount() < frame.keys.size()) {  // adding a key again replaces it
         fContext.Fail(EStatus::kParseError, "found a key a second time in one path, expected each once");
     }
     return path;
@@ -121,6 +121,7 @@ const std::string& TCimXmlPathReader::FindOnlyKey(const TInMemClass* cls) const
     return cls->GetLayout().GetDecl(cls->GetLayout().GetKeys().front()).GetName();
 }
 
+/// References in a row are mostly to the same class, so the last one is compared before it is looked up.
 boost::shared_ptr<TInMemClass> TCimXmlPathReader::FindClass(const std::string& name)
 {
     if (!fNamespace || (fLastClass && fLastClass->GetName() == name)) {
@@ -133,6 +134,7 @@ boost::shared_ptr<TInMemClass> TCimXmlPathReader::FindClass(const std::string& n
     return cls;
 }
 
+/// The name in front of an object is the outermost frame.
 void TCimXmlPathReader::NoteOwnNamespace()
 {
     const TFrame& frame = fFrames.front();
@@ -230,6 +232,7 @@ void TCimXmlPathReader::AddKey(TCIMValue value)
     frame.keyName.clear();
 }
 
+/// TYPE is exact, but newer than VALUETYPE, which many writers give alone. Without either, a key is text.
 TCIMValue TCimXmlPathReader::ReadKey(std::string_view text)
 {
     const TType type = TValueText::FindType(fType);

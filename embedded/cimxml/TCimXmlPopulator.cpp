@@ -174,6 +174,7 @@ TLoadReport TCimXmlPopulator::LoadFromSource(const TPullSource& source, const st
     return Load(name, [&](TLoad& load) { load.ReadSource(source); });
 }
 
+/// The source is passed by reference, because it owns the open file.
 TLoadReport TCimXmlPopulator::LoadFile(const std::string& path)
 {
     TFileSource file(path);

@@ -29,6 +29,7 @@ void AppendFlag(std::string& out, const char* name, bool value)
     TValueXml::AppendAttribute(out, name, value ? "true" : "false");
 }
 
+/// ANY is not written, because no DTD has it: all scopes are written one by one.
 void AppendScope(std::string& out, TDecl::EScope scope)
 {
     out += "<SCOPE";
@@ -59,6 +60,7 @@ void AppendNamespacePath(std::string& out, const std::string& name, const std::s
     out += host.empty() ? "</LOCALNAMESPACEPATH>\n" : "</LOCALNAMESPACEPATH></NAMESPACEPATH>\n";
 }
 
+/// All flavors are written, also those that are the default.
 void AppendQualifierDecl(std::string& out, const ICIMQualifierDecl& decl)
 {
     const TCIMValue& value = decl.GetValue(TCallContext());
@@ -180,6 +182,7 @@ void TCimXmlWriter::WriteInstance(const ICIMInstance& instance)
     });
 }
 
+/// A second call must not write the end tags again.
 void TCimXmlWriter::EndDocument()
 {
     if (!fEnded) {

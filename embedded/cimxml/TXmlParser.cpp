@@ -1,3 +1,7 @@
+// The host's XML parser for other libraries: the events of TXmlReader as calls of virtual operations.
+//
+// Attributes become a map, and text is handed over with the next tag or when the derived class asks for it. A document in error
+// ends with one call of FatalError; an exception of the derived class passes through Parse as it was.
 #include "host/TXmlParser.h"
 
 #include <cstring>

@@ -115,6 +115,7 @@ struct TXmlReader::TCallbacks {
         return XML_STATUS_ERROR;
     }
 
+    /// Expat does not report an undeclared entity itself if the document has a DTD that was not read.
     static void SkippedEntity(void* user, const char*, int) noexcept
     {
         Guarded(user, [](TXmlReader& reader) { reader.Refuse("undeclared entity"); });
@@ -180,6 +181,7 @@ const char* TXmlReader::FindExcess(const char** attributes)
     return nullptr;
 }
 
+/// Expat takes lengths as int, so longer text is parsed in pieces.
 bool TXmlReader::Parse(const char* data, std::size_t length, bool last)
 {
     while (!fStopped && (length > 0 || last)) {
@@ -258,6 +260,7 @@ void TXmlReader::Stop()
     XML_StopParser(fParser.get(), XML_FALSE);
 }
 
+/// Ends the parse for a reason of this reader, with the place of the event.
 void TXmlReader::Refuse(const char* reason)
 {
     fError = reason;
