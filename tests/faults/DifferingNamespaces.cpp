@@ -5,6 +5,7 @@
 #include "host/TAddToVectorCallback.h"
 #include "host/TZELException.h"
 #include "tests/support/Dump.h"
+#include "tests/support/NoContext.h"
 
 namespace NORVZEL20 {
 
@@ -12,7 +13,6 @@ namespace {
 
 using EType = TCIMValue::TCIMType::ECIMType;
 
-const TCallContext kNone;
 const char* const kClasses[] = {"Disk", "Ssd", "Slot"};
 
 void DeclareDiffering(TNamespaceBuilder& builder, std::size_t index, EFlaw flaw)

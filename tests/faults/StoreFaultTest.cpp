@@ -6,6 +6,7 @@
 #include "embedded/store/TInMemQualifier.h"
 #include "tests/faults/FailEachAllocation.h"
 #include "tests/support/Dump.h"
+#include "tests/support/NoContext.h"
 #include "tests/support/TComparisonRun.h"
 
 namespace NORVZEL20 {
@@ -14,7 +15,6 @@ namespace {
 using EType = TCIMValue::TCIMType::ECIMType;
 using TChange = std::function<void(ICIMNamespace&)>;
 
-const TCallContext kNone;
 const char kLong[] = "a value that is too long to be held inside";
 const int kDisks = 40;
 

@@ -4,12 +4,11 @@
 #include "host/TZELException.h"
 #include "tests/faults/DifferingNamespaces.h"
 #include "tests/faults/FailEachAllocation.h"
+#include "tests/support/NoContext.h"
 #include "tests/support/TComparisonRun.h"
 
 namespace NORVZEL20 {
 namespace {
-
-const TCallContext kNone;
 
 /// An instance that fails after it has delivered some of its properties.
 class TBrokenInstance : public ICIMInstance {

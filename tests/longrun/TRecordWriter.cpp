@@ -1,12 +1,11 @@
 #include "tests/longrun/TRecordWriter.h"
 
 #include "host/TAddToVectorCallback.h"
+#include "tests/support/NoContext.h"
 
 namespace NORVZEL20 {
 
 namespace {
-
-const TCallContext kNone;
 
 TCIMValue ValueOf(const ICIMInstance& instance, const std::string& name)
 {

@@ -4,13 +4,12 @@
 #include "provider/TDeltaClass.h"
 #include "tests/provider/TAnsweringClass.h"
 #include "tests/provider/TDeltaFixture.h"
+#include "tests/support/NoContext.h"
 #include "tests/support/plain/TPlainNamespace.h"
 #include "tests/support/plain/TPlainQualifier.h"
 
 namespace NORVZEL20 {
 namespace {
-
-const TCallContext kNone;
 
 // A wrapper of a class whose answers the test chooses, and one element of each kind to pass to it.
 class DeltaClassAnswersTest : public TDeltaFixture {

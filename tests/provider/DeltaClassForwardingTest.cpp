@@ -2,13 +2,12 @@
 
 #include "provider/TDeltaClass.h"
 #include "tests/provider/TDeltaFixture.h"
+#include "tests/support/NoContext.h"
 #include "tests/support/TTestAccess.h"
 #include "tests/support/plain/TPlainQualifier.h"
 
 namespace NORVZEL20 {
 namespace {
-
-const TCallContext kNone;
 
 // Calls the wrapper of Base in the compared namespace 1. The wrapped class records the calls that reach it.
 class DeltaClassForwardingTest : public TDeltaFixture {

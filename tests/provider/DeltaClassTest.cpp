@@ -5,14 +5,13 @@
 #include "provider/TDeltaClass.h"
 #include "tests/provider/TDeltaFixture.h"
 #include "tests/support/Dump.h"
+#include "tests/support/NoContext.h"
 #include "tests/support/TTestAccess.h"
 
 namespace NORVZEL20 {
 namespace {
 
 using TClassCallback = boost::function<bool(boost::shared_ptr<ICIMClass>)>;
-
-const TCallContext kNone;
 
 // Base > Sub, and here also Base > Twin, in each compared namespace.
 class DeltaClassTest : public TDeltaFixture {

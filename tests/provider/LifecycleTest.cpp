@@ -4,6 +4,7 @@
 #include "provider/TDeltaClass.h"
 #include "provider/TDeltaNamespaceProvider.h"
 #include "tests/provider/TDeltaFixture.h"
+#include "tests/support/NoContext.h"
 #include "tests/support/TTestAccess.h"
 #include "tests/support/plain/TPlainClass.h"
 #include "tests/support/plain/TPlainNamespace.h"
@@ -11,8 +12,6 @@
 
 namespace NORVZEL20 {
 namespace {
-
-const TCallContext kNone;
 
 boost::shared_ptr<TDeltaNamespace> WithoutStore()
 {

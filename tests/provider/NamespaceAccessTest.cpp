@@ -7,14 +7,13 @@
 #include "provider/TDeltaClass.h"
 #include "provider/TDeltaNamespaceProvider.h"
 #include "tests/provider/TDeltaFixture.h"
+#include "tests/support/NoContext.h"
 #include "tests/support/TTestAccess.h"
 #include "tests/support/watched/TWatchedClass.h"
 #include "tests/support/watched/TWatchedNamespace.h"
 
 namespace NORVZEL20 {
 namespace {
-
-const TCallContext kNone;
 
 class NamespaceAccessTest : public TDeltaFixture {
   protected:

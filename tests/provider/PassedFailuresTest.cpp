@@ -4,13 +4,12 @@
 
 #include "host/TZELException.h"
 #include "tests/provider/TDeltaFixture.h"
+#include "tests/support/NoContext.h"
 #include "tests/support/TTestAccess.h"
 #include "tests/support/watched/TWatchedNamespace.h"
 
 namespace NORVZEL20 {
 namespace {
-
-const TCallContext kNone;
 
 // Exceptions of a host's own: one with a status, and one without.
 struct TOwnStatus : TZELException {

@@ -5,14 +5,13 @@
 #include "host/TOSSpecific.h"
 #include "provider/TDeltaNamespaceProvider.h"
 #include "tests/provider/TDeltaFixture.h"
+#include "tests/support/NoContext.h"
 #include "tests/support/TTestAccess.h"
 
 namespace NORVZEL20 {
 namespace {
 
 using testing::UnorderedElementsAre;
-
-const TCallContext kNone;
 
 boost::shared_ptr<TDeltaNamespace> Allocate(const TCallContext& context, bool flag, const std::string& name)
 {

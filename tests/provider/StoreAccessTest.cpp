@@ -3,13 +3,12 @@
 #include "provider/TDeltaNamespaceProvider.h"
 #include "tests/provider/TDeltaFixture.h"
 #include "tests/support/Dump.h"
+#include "tests/support/NoContext.h"
 #include "tests/support/TTestAccess.h"
 #include "tests/support/watched/TWatchedNamespace.h"
 
 namespace NORVZEL20 {
 namespace {
-
-const TCallContext kNone;
 
 class StoreAccessTest : public TDeltaFixture {
   protected:

@@ -5,12 +5,11 @@
 #include <boost/smart_ptr/make_shared.hpp>
 
 #include "host/ICIMNamespace.h"
+#include "tests/support/NoContext.h"
 #include "tests/support/StatusOf.h"
 
 namespace NORVZEL20 {
 namespace {
-
-const TCallContext kNone;
 
 TEST(StubClassTest, HasANameAndNothingElse)
 {

@@ -1,0 +1,10 @@
+#pragma once
+
+#include "host/TCallContext.h"
+
+namespace NORVZEL20 {
+
+/// The empty context, with which most tests call.
+inline const TCallContext kNone;
+
+}  // namespace NORVZEL20
