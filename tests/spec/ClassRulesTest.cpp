@@ -5,6 +5,7 @@
 
 #include "embedded/services/TAssertionFailure.h"
 #include "spec/TDiffClassRules.h"
+#include "tests/spec/PropertyRules.h"
 #include "tests/support/Dump.h"
 #include "tests/support/TCapturingLogger.h"
 
@@ -13,8 +14,6 @@ namespace {
 
 using testing::ElementsAre;
 using TRules = TCIMDiffEngine::TDiffClassRules;
-constexpr auto INCLUDE = TCIMDiffEngine::INCLUDE;
-constexpr auto EXCLUDE = TCIMDiffEngine::EXCLUDE;
 
 TEST(PropTypeTest, NumbersAndTextsAreFixed)
 {

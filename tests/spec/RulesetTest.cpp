@@ -5,6 +5,7 @@
 #include "embedded/services/TAssertionFailure.h"
 #include "host/TZELException.h"
 #include "spec/TDiffClassRules.h"
+#include "tests/spec/PropertyRules.h"
 #include "tests/support/Dump.h"
 #include "tests/support/TCapturingLogger.h"
 #include "tests/support/TComparisonRun.h"
@@ -15,8 +16,6 @@ namespace {
 
 using TRules = TCIMDiffEngine::TDiffClassRules;
 using TProperties = std::map<std::string, TCIMDiffEngine::propType>;
-constexpr auto INCLUDE = TCIMDiffEngine::INCLUDE;
-constexpr auto EXCLUDE = TCIMDiffEngine::EXCLUDE;
 
 boost::shared_ptr<TRules> Rules(TCIMDiffEngine::propType def, const TProperties& properties, const std::string& excludedKeys = "")
 {
