@@ -27,7 +27,7 @@ TProviderLibrary TProviderLibrary::Load(const std::string& path)
         throw TZELException(TZELStatusCode::kFileError);
     }
     std::vector<std::string> names = manager->GetProviderNames();
-    names.erase(names.begin(), names.begin() + std::vector<std::string>::difference_type(before));
+    names.erase(names.begin(), names.begin() + static_cast<std::vector<std::string>::difference_type>(before));
     return TProviderLibrary(path, std::move(names));
 }
 
