@@ -53,7 +53,7 @@ void AppendNamespacePath(std::string& out, const std::string& name, const std::s
     for (std::size_t start = 0; start <= name.size();) {
         const std::size_t end = std::min(name.find('/', start), name.size());
         out += "<NAMESPACE";
-        TValueXml::AppendAttribute(out, "NAME", std::string_view(name).substr(start, end - start));
+        TValueXml::AppendAttribute(out, "NAME", std::string_view{name}.substr(start, end - start));
         out += "/>";
         start = end + 1;
     }

@@ -98,14 +98,14 @@ void FillSlots(TNamespaceBuilder& builder, std::size_t index, EFlaw flaw)
 void CopyInstances(TNamespaceBuilder& builder, ICIMNamespace& from, const std::string& className)
 {
     std::vector<boost::shared_ptr<ICIMInstance>> instances;
-    from.GetClass(className, kNone)->EnumerateInstances(TAddToVectorCallback<ICIMInstance>(&instances), false, kNone);
+    from.GetClass(className, kNoContext)->EnumerateInstances(TAddToVectorCallback<ICIMInstance>(&instances), false, kNoContext);
     for (const auto& instance : instances) {
         TNamespaceBuilder::TValues values;
         const auto append = [&values](boost::shared_ptr<ICIMProperty> property) {
-            values.emplace_back(property->GetPropertyDecl(kNone)->GetName(kNone), property->GetValue(kNone));
+            values.emplace_back(property->GetPropertyDecl(kNoContext)->GetName(kNoContext), property->GetValue(kNoContext));
             return true;
         };
-        instance->EnumerateProperties(append, kNone);
+        instance->EnumerateProperties(append, kNoContext);
         builder.Instance(className, values);
     }
 }

@@ -50,11 +50,11 @@ std::string DumpStore(boost::shared_ptr<ICIMNamespace> ns)
 {
     std::string text = DumpInstances(ns, "Disk") + DumpInstances(ns, "Ssd");
     const auto append = [&text](boost::shared_ptr<ICIMInstance> instance) {
-        const auto note = boost::dynamic_pointer_cast<TInMemProperty>(instance->GetProperty("Note", kNone));
+        const auto note = boost::dynamic_pointer_cast<TInMemProperty>(instance->GetProperty("Note", kNoContext));
         text += note->IsChanged() ? "was " + note->GetEarlierValue()->ToText() + "\n" : "";
         return true;
     };
-    ns->GetClass("Disk", kNone)->EnumerateInstances(append, false, kNone);
+    ns->GetClass("Disk", kNoContext)->EnumerateInstances(append, false, kNoContext);
     return text;
 }
 
@@ -65,7 +65,7 @@ std::vector<boost::shared_ptr<ICIMInstance>> InstancesOf(ICIMClass& cls)
         instances.push_back(instance);
         return true;
     };
-    cls.EnumerateInstances(append, false, kNone);
+    cls.EnumerateInstances(append, false, kNoContext);
     return instances;
 }
 
@@ -101,36 +101,38 @@ std::string FailEach(const std::string& name, TChange change)
 TEST(StoreOutOfMemory, MarkingAPropertyChangesAndRemembersOrNeither)
 {
     EXPECT_EQ("bad_alloc", FailEach("MarkChanged", [](ICIMNamespace& ns) {
-                  ns.GetInstance(PathOf("3"), kNone)->GetProperty("Note", kNone)->MarkChanged(TCIMValue(std::string(kLong) + "!"));
+                  ns.GetInstance(PathOf("3"), kNoContext)
+                      ->GetProperty("Note", kNoContext)
+                      ->MarkChanged(TCIMValue(std::string(kLong) + "!"));
               }));
 }
 
 TEST(StoreOutOfMemory, SettingAKeyKeepsTheInstanceInItsPlace)
 {
     EXPECT_EQ("bad_alloc", FailEach("SetKey", [](ICIMNamespace& ns) {
-                  ns.GetInstance(PathOf("3"), kNone)->GetProperty("Id", kNone)->SetValue(TCIMValue(kLong), kNone);
+                  ns.GetInstance(PathOf("3"), kNoContext)->GetProperty("Id", kNoContext)->SetValue(TCIMValue(kLong), kNoContext);
               }));
 }
 
 TEST(StoreOutOfMemory, AddingAnInstanceAddsItOrNot)
 {
     EXPECT_EQ("bad_alloc", FailEach("AddToNamespace", [](ICIMNamespace& ns) {
-                  const auto instance = ns.GetClass("Disk", kNone)->AllocateInstance(kNone);
-                  instance->GetProperty("Id", kNone)->SetValue(TCIMValue(kLong), kNone);
-                  instance->AddToNamespace(kNone);
+                  const auto instance = ns.GetClass("Disk", kNoContext)->AllocateInstance(kNoContext);
+                  instance->GetProperty("Id", kNoContext)->SetValue(TCIMValue(kLong), kNoContext);
+                  instance->AddToNamespace(kNoContext);
               }));
 }
 
 TEST(StoreOutOfMemory, ModifyingAnInstanceModifiesItOrNot)
 {
     EXPECT_EQ("bad_alloc", FailEach("ModifyInstance", [](ICIMNamespace& ns) {
-                  ns.ModifyInstance(PathOf("3"), {{"Note", std::string(kLong) + "!"}}, kNone);
+                  ns.ModifyInstance(PathOf("3"), {{"Note", std::string(kLong) + "!"}}, kNoContext);
               }));
 }
 
 TEST(StoreOutOfMemory, DeletingAnInstanceDeletesItOrNot)
 {
-    EXPECT_EQ("bad_alloc", FailEach("DeleteInstance", [](ICIMNamespace& ns) { ns.DeleteInstance(PathOf("3"), kNone); }));
+    EXPECT_EQ("bad_alloc", FailEach("DeleteInstance", [](ICIMNamespace& ns) { ns.DeleteInstance(PathOf("3"), kNoContext); }));
 }
 
 TEST(StoreOutOfMemory, TidyingUpAfterDeletionsCanWait)
@@ -142,10 +144,10 @@ TEST(StoreOutOfMemory, TidyingUpAfterDeletionsCanWait)
         std::string outcome;
         do {
             TFailingAllocator::Fail(++allocation);
-            outcome = OutcomeOf([&] { store->DeleteInstance(path, kNone); });
+            outcome = OutcomeOf([&] { store->DeleteInstance(path, kNoContext); });
         } while (outcome == "bad_alloc");
         ASSERT_EQ("", outcome) << number;
-        ASSERT_EQ("status 15", OutcomeOf([&] { store->GetInstance(path, kNone); })) << number;
+        ASSERT_EQ("status 15", OutcomeOf([&] { store->GetInstance(path, kNoContext); })) << number;
     }
     EXPECT_EQ("", DumpInstances(store, "Disk"));
 }
@@ -153,17 +155,17 @@ TEST(StoreOutOfMemory, TidyingUpAfterDeletionsCanWait)
 TEST(StoreOutOfMemory, AddingAPropertyToAClassInUseAddsItOrNot)
 {
     EXPECT_EQ("bad_alloc", FailEach("AddPropertyDecl", [](ICIMNamespace& ns) {
-                  const auto cls = ns.GetClass("Disk", kNone);
-                  cls->AddPropertyDecl(cls->AllocatePropertyDecl("Label", TCIMValue::Null(EType::kString), kNone));
+                  const auto cls = ns.GetClass("Disk", kNoContext);
+                  cls->AddPropertyDecl(cls->AllocatePropertyDecl("Label", TCIMValue::Null(EType::kString), kNoContext));
               }));
 }
 
 TEST(StoreOutOfMemory, AddingAKeyToAClassInUseAddsItOrNot)
 {
     EXPECT_EQ("bad_alloc", FailEach("AddKeyDecl", [](ICIMNamespace& ns) {
-                  const auto cls = ns.GetClass("Disk", kNone);
-                  const auto decl = cls->AllocatePropertyDecl("Bay", TCIMValue::Null(EType::kUint8), kNone);
-                  decl->AddQualifier(KeyQualifier(), kNone);
+                  const auto cls = ns.GetClass("Disk", kNoContext);
+                  const auto decl = cls->AllocatePropertyDecl("Bay", TCIMValue::Null(EType::kUint8), kNoContext);
+                  decl->AddQualifier(KeyQualifier(), kNoContext);
                   cls->AddPropertyDecl(decl);
               }));
 }
@@ -171,15 +173,15 @@ TEST(StoreOutOfMemory, AddingAKeyToAClassInUseAddsItOrNot)
 TEST(StoreOutOfMemory, APropertyOfAClassInUseBecomesAKeyOrNot)
 {
     EXPECT_EQ("bad_alloc", FailEach("AddKeyQualifier", [](ICIMNamespace& ns) {
-                  ns.GetClass("Disk", kNone)->GetPropertyDecl("Note", kNone)->AddQualifier(KeyQualifier(), kNone);
+                  ns.GetClass("Disk", kNoContext)->GetPropertyDecl("Note", kNoContext)->AddQualifier(KeyQualifier(), kNoContext);
               }));
 }
 
 TEST(StoreOutOfMemory, RemovingAPropertyOfAClassInUseRemovesItOrNot)
 {
     EXPECT_EQ("bad_alloc", FailEach("RemovePropertyDecl", [](ICIMNamespace& ns) {
-                  const auto cls = ns.GetClass("Disk", kNone);
-                  cls->RemovePropertyDecl(cls->GetPropertyDecl("Size", kNone));
+                  const auto cls = ns.GetClass("Disk", kNoContext);
+                  cls->RemovePropertyDecl(cls->GetPropertyDecl("Size", kNoContext));
               }));
 }
 
@@ -187,22 +189,22 @@ TEST(StoreOutOfMemory, RemovingAPropertyOfAClassInUseRemovesItOrNot)
 TEST(StoreOutOfMemory, FindingByKeysThatHaveChangedFindsOrFails)
 {
     const auto store = MakeDisks();
-    const auto cls = store->GetClass("Disk", kNone);
-    const auto decl = cls->AllocatePropertyDecl("Bay", TCIMValue::Null(EType::kUint8), kNone);
-    decl->AddQualifier(KeyQualifier(), kNone);
+    const auto cls = store->GetClass("Disk", kNoContext);
+    const auto decl = cls->AllocatePropertyDecl("Bay", TCIMValue::Null(EType::kUint8), kNoContext);
+    decl->AddQualifier(KeyQualifier(), kNoContext);
     cls->AddPropertyDecl(decl);
     std::vector<boost::shared_ptr<ICIMInstance>> disks = InstancesOf(*cls);
-    const TCIMReference path = disks.back()->GetReference(kNone);
+    const TCIMReference path = disks.back()->GetReference(kNoContext);
     std::size_t allocation = 0;
     while (OutcomeOf([&] {
                TFailingAllocator::Fail(++allocation);
-               store->GetInstance(path, kNone);
+               store->GetInstance(path, kNoContext);
            }) == "bad_alloc") {
         ASSERT_GT(disks.size(), 1u);
         EXPECT_TRUE(cls->RemoveInstance(disks.front())) << allocation;
         disks.erase(disks.begin());
     }
-    EXPECT_EQ(disks.back(), store->GetInstance(path, kNone));
+    EXPECT_EQ(disks.back(), store->GetInstance(path, kNoContext));
     EXPECT_GT(allocation, 5u);
     EXPECT_EQ(disks, InstancesOf(*cls));
 }

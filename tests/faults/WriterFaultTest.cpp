@@ -46,8 +46,8 @@ TEST(WriterFaults, AnInstanceThatTheHostCannotTellIsLeftOutWhole)
 {
     TNamespaceBuilder builder(MakeNamespace(EHost::kInmem, "root/cimv2"));
     builder.Class("Disk", "", {TNamespaceBuilder::Key("Id"), TNamespaceBuilder::Property("Label")});
-    const auto good = builder.GetNamespace()->GetClass("Disk", kNone)->AllocateInstance(kNone);
-    good->GetProperty("Id", kNone)->SetValue(TCIMValue("a"), kNone);
+    const auto good = builder.GetNamespace()->GetClass("Disk", kNoContext)->AllocateInstance(kNoContext);
+    good->GetProperty("Id", kNoContext)->SetValue(TCIMValue("a"), kNoContext);
     for (const int told : {0, 1}) {
         std::string text;
         TCimXmlWriter writer([&text](std::string_view piece) { text += piece; });

@@ -9,17 +9,17 @@ namespace {
 
 TCIMValue ValueOf(const ICIMInstance& instance, const std::string& name)
 {
-    return instance.GetProperty(name, kNone)->GetValue(kNone);
+    return instance.GetProperty(name, kNoContext)->GetValue(kNoContext);
 }
 
 void Set(const ICIMInstance& instance, const std::string& name, const TCIMValue& value)
 {
-    instance.GetProperty(name, kNone)->SetValue(value, kNone);
+    instance.GetProperty(name, kNoContext)->SetValue(value, kNoContext);
 }
 
 TCIMValue PathOf(const ICIMInstance& instance)
 {
-    return TCIMValue(instance.GetReference(kNone));
+    return TCIMValue(instance.GetReference(kNoContext));
 }
 
 TCIMValue MakeIndices(const std::vector<unsigned short>& indices)
@@ -33,11 +33,11 @@ TCIMValue MakeIndices(const std::vector<unsigned short>& indices)
 TRecordWriter::TRecordWriter(boost::shared_ptr<ICIMNamespace> source)
 {
     std::vector<boost::shared_ptr<ICIMInstance>> ties;
-    source->GetClass("KALMO_DeltaClassAssocToDelta", kNone)
-        ->EnumerateInstances(TAddToVectorCallback<ICIMInstance>(&ties), false, kNone);
+    source->GetClass("KALMO_DeltaClassAssocToDelta", kNoContext)
+        ->EnumerateInstances(TAddToVectorCallback<ICIMInstance>(&ties), false, kNoContext);
     for (const auto& tie : ties) {
-        const auto classRecord = source->GetInstance(TCIMReference(ValueOf(*tie, "Class")), kNone);
-        const auto record = source->GetInstance(TCIMReference(ValueOf(*tie, "Delta")), kNone);
+        const auto classRecord = source->GetInstance(TCIMReference(ValueOf(*tie, "Class")), kNoContext);
+        const auto record = source->GetInstance(TCIMReference(ValueOf(*tie, "Delta")), kNoContext);
         const TCIMValue indices = ValueOf(*record, "NamespaceIndices");
         fDeltas.push_back({ValueOf(*classRecord, "ClassName").ToText(),
                            static_cast<unsigned char>(ValueOf(*record, "Type").GetUnsigned()),
@@ -62,25 +62,25 @@ void TRecordWriter::WriteInto(ICIMNamespace& target) const
 
 boost::shared_ptr<ICIMInstance> TRecordWriter::WriteClass(ICIMNamespace& target, const std::string& name)
 {
-    const auto record = target.GetClass("KALMO_DeltaClass", kNone)->AllocateInstance(kNone);
+    const auto record = target.GetClass("KALMO_DeltaClass", kNoContext)->AllocateInstance(kNoContext);
     Set(*record, "ClassName", TCIMValue(name));
-    record->AddToNamespace(kNone);
+    record->AddToNamespace(kNoContext);
     return record;
 }
 
 void TRecordWriter::WriteDelta(ICIMNamespace& target, const ICIMInstance& classRecord, const TDelta& delta)
 {
-    const auto record = target.GetClass("KALMO_Delta", kNone)->AllocateInstance(kNone);
+    const auto record = target.GetClass("KALMO_Delta", kNoContext)->AllocateInstance(kNoContext);
     Set(*record, "Type", TCIMValue(delta.type));
     Set(*record, "InstanceName", TCIMValue(delta.instanceName));
     Set(*record, "Property", TCIMValue(delta.property));
     Set(*record, "NamespaceIndices", MakeIndices(delta.indices));
-    record->AddToNamespace(kNone);
+    record->AddToNamespace(kNoContext);
 
-    const auto tie = target.GetClass("KALMO_DeltaClassAssocToDelta", kNone)->AllocateInstance(kNone);
+    const auto tie = target.GetClass("KALMO_DeltaClassAssocToDelta", kNoContext)->AllocateInstance(kNoContext);
     Set(*tie, "Class", PathOf(classRecord));
     Set(*tie, "Delta", PathOf(*record));
-    tie->AddToNamespace(kNone);
+    tie->AddToNamespace(kNoContext);
 }
 
 }  // namespace NORVZEL20

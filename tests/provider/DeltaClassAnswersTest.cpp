@@ -18,11 +18,11 @@ class DeltaClassAnswersTest : public TDeltaFixture {
         : fClass(boost::make_shared<TAnsweringClass>("Odd", fPlain, nullptr)), fWrapper(fComparison.GetDelta(), fClass)
     {
         TNamespaceBuilder(fInmem).Class("Disk", "", {TNamespaceBuilder::Key("Id")});
-        fElement = fInmem->GetClass("Disk", kNone);
-        fInstance = fElement->AllocateInstance(kNone);
-        fPropertyDecl = fElement->GetPropertyDecl("Id", kNone);
-        fMethodDecl = fElement->AllocateMethodDecl("Run", TCIMValue::TCIMType::kUint32, kNone);
-        fClass->SetProperty(fInstance->GetProperty("Id", kNone));
+        fElement = fInmem->GetClass("Disk", kNoContext);
+        fInstance = fElement->AllocateInstance(kNoContext);
+        fPropertyDecl = fElement->GetPropertyDecl("Id", kNoContext);
+        fMethodDecl = fElement->AllocateMethodDecl("Run", TCIMValue::TCIMType::kUint32, kNoContext);
+        fClass->SetProperty(fInstance->GetProperty("Id", kNoContext));
         fClass->SetMethodDecl(fMethodDecl);
     }
 
@@ -99,7 +99,7 @@ TEST_F(DeltaClassAnswersTest, QuestionsAreAnsweredAsTheClassDoes)
 
 TEST_F(DeltaClassAnswersTest, WhatTheClassGivesOutIsHandedOn)
 {
-    EXPECT_EQ(fInstance->GetProperty("Id", kNone), fWrapper.GetProperty("Id", At(1)));
+    EXPECT_EQ(fInstance->GetProperty("Id", kNoContext), fWrapper.GetProperty("Id", At(1)));
     EXPECT_EQ(fMethodDecl, fWrapper.GetMethodDecl("Run", At(1)));
 }
 
@@ -107,7 +107,7 @@ TEST_F(DeltaClassAnswersTest, ElementsOfAnEnumerationReachTheCaller)
 {
     boost::shared_ptr<ICIMProperty> property;
     fWrapper.EnumerateStaticProperties([&](boost::shared_ptr<ICIMProperty> each) { return property = each, true; }, At(1));
-    EXPECT_EQ(fInstance->GetProperty("Id", kNone), property);
+    EXPECT_EQ(fInstance->GetProperty("Id", kNoContext), property);
     boost::shared_ptr<ICIMMethodDecl> decl;
     fWrapper.EnumerateMethodDecls([&](boost::shared_ptr<ICIMMethodDecl> each) { return decl = each, true; }, At(1));
     EXPECT_EQ(fMethodDecl, decl);
@@ -145,9 +145,9 @@ TEST_F(DeltaClassAnswersTest, AQualifierThatIsAddedIsTheCallersOwn)
 
 TEST_F(DeltaClassAnswersTest, AWrapperIsComparedWithAnyClassByName)
 {
-    const TDeltaClass base(fComparison.GetDelta(), fComparison.Watched(1)->GetClass("Base", kNone));
-    const auto sameName = fComparison.Watched(0)->GetClass("Base", kNone);
-    const auto laterName = fComparison.Watched(0)->GetClass("Sub", kNone);
+    const TDeltaClass base(fComparison.GetDelta(), fComparison.Watched(1)->GetClass("Base", kNoContext));
+    const auto sameName = fComparison.Watched(0)->GetClass("Base", kNoContext);
+    const auto laterName = fComparison.Watched(0)->GetClass("Sub", kNoContext);
     Watch().Forget();
     EXPECT_TRUE(base == *sameName);
     EXPECT_EQ("ns1:Base.GetName() {}\nns0:Base.GetName() {}\n", Watch().TakeText());

@@ -52,13 +52,13 @@ TEST_F(DeltaClassForwardingTest, KeyNamesArePassedDirectly)
     const std::string* name = nullptr;
     fBase->EnumerateKeyNames([&](const std::string* each) { return name = each, true; }, At(1));
     EXPECT_EQ("EnumerateKeyNames() {nsIndex=1}\n", Call());
-    const auto base = fComparison.Namespace(1).GetNamespace()->GetClass("Base", kNone);
-    EXPECT_EQ(&base->GetPropertyDecl("Id", kNone)->GetName(kNone), name);
+    const auto base = fComparison.Namespace(1).GetNamespace()->GetClass("Base", kNoContext);
+    EXPECT_EQ(&base->GetPropertyDecl("Id", kNoContext)->GetName(kNoContext), name);
 }
 
 TEST_F(DeltaClassForwardingTest, DeclarationsOfProperties)
 {
-    EXPECT_EQ("Id", fBase->GetPropertyDecl("Id", At(1))->GetName(kNone));
+    EXPECT_EQ("Id", fBase->GetPropertyDecl("Id", At(1))->GetName(kNoContext));
     EXPECT_EQ("GetPropertyDecl(\"Id\") {nsIndex=1}\n", Call());
     fBase->EnumeratePropertyDecls(&Take<ICIMPropertyDecl>, At(1));
     EXPECT_EQ("EnumeratePropertyDecls() {nsIndex=1}\n", Call());
@@ -108,15 +108,15 @@ TEST_F(DeltaClassForwardingTest, QualifiersThroughEitherBase)
 
 TEST_F(DeltaClassForwardingTest, ElementsThatAreAddedAndRemoved)
 {
-    EXPECT_TRUE(fBase->AddChildClass(fComparison.Namespace(1).GetNamespace()->GetClass("Sub", kNone)));
+    EXPECT_TRUE(fBase->AddChildClass(fComparison.Namespace(1).GetNamespace()->GetClass("Sub", kNoContext)));
     EXPECT_EQ("AddChildClass(Sub)\n", Call());
-    EXPECT_TRUE(fBase->RemoveChildClass(fComparison.Namespace(1).GetNamespace()->GetClass("Sub", kNone)));
+    EXPECT_TRUE(fBase->RemoveChildClass(fComparison.Namespace(1).GetNamespace()->GetClass("Sub", kNoContext)));
     EXPECT_EQ("RemoveChildClass(Sub)\n", Call());
-    EXPECT_FALSE(fBase->RemoveChildClass(fComparison.Namespace(1).GetNamespace()->GetClass("Sub", kNone)));
+    EXPECT_FALSE(fBase->RemoveChildClass(fComparison.Namespace(1).GetNamespace()->GetClass("Sub", kNoContext)));
     EXPECT_EQ("RemoveChildClass(Sub)\n", Call());
-    EXPECT_TRUE(fBase->AddAssociationClass(fComparison.Namespace(1).GetNamespace()->GetClass("Sub", kNone)));
+    EXPECT_TRUE(fBase->AddAssociationClass(fComparison.Namespace(1).GetNamespace()->GetClass("Sub", kNoContext)));
     EXPECT_EQ("AddAssociationClass(Sub)\n", Call());
-    EXPECT_FALSE(fBase->RemoveAssociationClass(fComparison.Namespace(1).GetNamespace()->GetClass("Sub", kNone)));
+    EXPECT_FALSE(fBase->RemoveAssociationClass(fComparison.Namespace(1).GetNamespace()->GetClass("Sub", kNoContext)));
     EXPECT_EQ("RemoveAssociationClass(Sub)\n", Call());
     EXPECT_FALSE(fBase->RemovePropertyDecl(nullptr));
     EXPECT_EQ("RemovePropertyDecl()\n", Call());
@@ -128,26 +128,26 @@ TEST_F(DeltaClassForwardingTest, ElementsThatAreAddedAndRemoved)
 
 TEST_F(DeltaClassForwardingTest, ADeclarationAddedLandsInTheWrappedClass)
 {
-    const auto base = fComparison.Namespace(1).GetNamespace()->GetClass("Base", kNone);
-    EXPECT_TRUE(fBase->AddPropertyDecl(base->AllocatePropertyDecl("Late", TCIMValue("x"), kNone)));
+    const auto base = fComparison.Namespace(1).GetNamespace()->GetClass("Base", kNoContext);
+    EXPECT_TRUE(fBase->AddPropertyDecl(base->AllocatePropertyDecl("Late", TCIMValue("x"), kNoContext)));
     EXPECT_EQ("AddPropertyDecl()\n", Call());
-    EXPECT_EQ("Late", base->GetPropertyDecl("Late", kNone)->GetName(kNone));
+    EXPECT_EQ("Late", base->GetPropertyDecl("Late", kNoContext)->GetName(kNoContext));
 }
 
 TEST_F(DeltaClassForwardingTest, AnInstanceAddedLandsInTheWrappedClass)
 {
-    const auto base = fComparison.Namespace(1).GetNamespace()->GetClass("Base", kNone);
-    const auto instance = base->AllocateInstance(kNone);
+    const auto base = fComparison.Namespace(1).GetNamespace()->GetClass("Base", kNoContext);
+    const auto instance = base->AllocateInstance(kNoContext);
     int count = 0;
     const auto increment = [&](boost::shared_ptr<ICIMInstance>) { return ++count, true; };
     EXPECT_TRUE(fBase->AddInstance(instance));
     EXPECT_EQ("AddInstance()\n", Call());
-    base->EnumerateInstances(increment, false, kNone);
+    base->EnumerateInstances(increment, false, kNoContext);
     EXPECT_EQ(1, count);
     EXPECT_TRUE(fBase->RemoveInstance(instance));
     EXPECT_EQ("RemoveInstance()\n", Call());
     EXPECT_FALSE(fBase->RemoveInstance(instance));
-    base->EnumerateInstances(increment, false, kNone);
+    base->EnumerateInstances(increment, false, kNoContext);
     EXPECT_EQ(1, count);
 }
 

@@ -54,7 +54,7 @@ TEST_F(DeltaClassTest, TheSuperclassIsAWrapperOfTheSameNamespace)
 TEST_F(DeltaClassTest, TheSuperclassNeedsTheIndex)
 {
     const auto sub = Wrapper("Sub", 1);
-    EXPECT_EQ(38, StatusOf([&] { sub->GetSuperClass(kNone); }));
+    EXPECT_EQ(38, StatusOf([&] { sub->GetSuperClass(kNoContext); }));
 }
 
 TEST_F(DeltaClassTest, TheSuperclassOfATopLevelClassFailsTheAssertion)
@@ -120,7 +120,7 @@ TEST_F(DeltaClassTest, TheWrappingCallbackAsksWithItsOwnCopyOfTheContext)
     const TCallbackWrapClass wrap(fComparison.GetDelta(), &collect, context);
     context.clear();
     const TClassCallback copy = wrap;
-    EXPECT_FALSE(copy(fComparison.Watched(0)->GetClass("Sub", kNone)));
+    EXPECT_FALSE(copy(fComparison.Watched(0)->GetClass("Sub", kNoContext)));
     ASSERT_EQ(1u, fClasses.size());
     EXPECT_EQ(Delta().GetClass("Sub", At(2)), fClasses[0]);
 }
@@ -137,7 +137,7 @@ TEST_F(DeltaClassTest, AncestryIsAskedOfTheWrappedClasses)
 TEST_F(DeltaClassTest, AncestryOfAClassThatIsNoWrapperFailsTheAssertion)
 {
     const auto sub = Wrapper("Sub", 1);
-    const auto raw = fComparison.Namespace(1).GetNamespace()->GetClass("Base", kNone);
+    const auto raw = fComparison.Namespace(1).GetNamespace()->GetClass("Base", kNoContext);
     EXPECT_TRUE(FailsOnNull([&] { sub->IsSubclassOf(raw, At(1)); }));
 }
 
@@ -177,7 +177,7 @@ TEST_F(DeltaClassTest, AssignmentCopiesNothing)
     const auto base = Wrapper("Base", 1);
     ICIMClass& target = *base;
     EXPECT_EQ(&target, &(target = static_cast<const ICIMClass&>(*Wrapper("Sub", 0))));
-    EXPECT_EQ("Base", base->GetName(kNone));
+    EXPECT_EQ("Base", base->GetName(kNoContext));
 }
 
 TEST_F(DeltaClassTest, ClearInstancesLeavesTheInstances)

@@ -86,11 +86,12 @@ TEST(LifecycleTest, WithoutAStoreEveryDelegatedOperationFailsTheAssertion)
     EXPECT_EQ(0, delta->NumContainers());
     EXPECT_EQ("", TTestAccess::SpecFileName(*delta));
     std::string text;
-    EXPECT_TRUE(FailsOnNull([&] { delta->GetClass("KALMO_Delta", kNone); }));
-    EXPECT_TRUE(FailsOnNull([&] { delta->GetInstance(TCIMReference(), kNone); }));
-    EXPECT_TRUE(FailsOnNull([&] { delta->DeleteInstance(TCIMReference(), kNone); }));
-    EXPECT_TRUE(FailsOnNull([&] { delta->ModifyInstance(TCIMReference(), kNone, kNone); }));
-    EXPECT_TRUE(FailsOnNull([&] { delta->ExecuteQuery([](boost::shared_ptr<ICIMInstance>) { return true; }, text, text, kNone); }));
+    EXPECT_TRUE(FailsOnNull([&] { delta->GetClass("KALMO_Delta", kNoContext); }));
+    EXPECT_TRUE(FailsOnNull([&] { delta->GetInstance(TCIMReference(), kNoContext); }));
+    EXPECT_TRUE(FailsOnNull([&] { delta->DeleteInstance(TCIMReference(), kNoContext); }));
+    EXPECT_TRUE(FailsOnNull([&] { delta->ModifyInstance(TCIMReference(), kNoContext, kNoContext); }));
+    EXPECT_TRUE(
+        FailsOnNull([&] { delta->ExecuteQuery([](boost::shared_ptr<ICIMInstance>) { return true; }, text, text, kNoContext); }));
 }
 
 TEST(LifecycleTest, ANullComparedNamespaceFailsTheAssertionWhenItIsAsked)

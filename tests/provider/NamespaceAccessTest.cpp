@@ -22,9 +22,9 @@ class NamespaceAccessTest : public TDeltaFixture {
 
 TEST_F(NamespaceAccessTest, ClassesOfTheStoreAreAnsweredByItWithoutAnIndex)
 {
-    const auto cls = Delta().GetClass("KALMO_Delta", kNone);
+    const auto cls = Delta().GetClass("KALMO_Delta", kNoContext);
     EXPECT_EQ("store.GetClass(\"KALMO_Delta\") {}\n", Watch().TakeText());
-    EXPECT_EQ("KALMO_Delta", cls->GetName(kNone));
+    EXPECT_EQ("KALMO_Delta", cls->GetName(kNoContext));
     EXPECT_EQ(nullptr, boost::dynamic_pointer_cast<TDeltaClass>(cls));
     EXPECT_EQ(0u, CacheSize(0) + CacheSize(1) + CacheSize(2));
 }
@@ -33,7 +33,7 @@ TEST_F(NamespaceAccessTest, AClassOfTheStoreIsTheStoresOwnObject)
 {
     const auto store = TNamespaceBuilder(MakeNamespace(EHost::kPlain, "root/cimv2")).DeltaSchema().GetNamespace();
     TTestAccess::SetStore(Delta(), store);
-    EXPECT_EQ(store->GetClass("KALMO_Delta", kNone), Delta().GetClass("KALMO_Delta", At(1)));
+    EXPECT_EQ(store->GetClass("KALMO_Delta", kNoContext), Delta().GetClass("KALMO_Delta", At(1)));
 }
 
 TEST_F(NamespaceAccessTest, TheStoreIsAskedFirstWhateverTheIndex)
@@ -51,7 +51,7 @@ TEST_F(NamespaceAccessTest, OtherClassesComeWrappedFromTheNamespaceThatTheIndexN
               Watch().TakeText());
     const auto wrapper = boost::dynamic_pointer_cast<TDeltaClass>(cls);
     ASSERT_NE(nullptr, wrapper);
-    EXPECT_EQ(fComparison.Namespace(1).GetNamespace()->GetClass("Sub", kNone),
+    EXPECT_EQ(fComparison.Namespace(1).GetNamespace()->GetClass("Sub", kNoContext),
               TWatchedClass::Unwatched(TTestAccess::WrappedClass(*wrapper)));
 }
 
@@ -98,7 +98,7 @@ TEST_F(NamespaceAccessTest, AFailureOfTheComparedNamespaceKeepsItsStatus)
 
 TEST_F(NamespaceAccessTest, AnUnknownClassNeedsAnIndex)
 {
-    EXPECT_EQ(38, StatusOf([&] { Delta().GetClass("Base", kNone); }));
+    EXPECT_EQ(38, StatusOf([&] { Delta().GetClass("Base", kNoContext); }));
     EXPECT_EQ("store.GetClass(\"Base\") {}\n", Watch().TakeText());
 }
 
@@ -168,7 +168,7 @@ TEST_F(OddNamespaceTest, ANullOfAComparedNamespaceIsWrapped)
     const auto cls = Delta().GetClass("Base", At(3));
     ASSERT_NE(nullptr, cls);
     EXPECT_EQ(cls, Delta().GetClass("Base", At(3)));
-    EXPECT_TRUE(FailsOnNull([&] { cls->GetName(kNone); }));
+    EXPECT_TRUE(FailsOnNull([&] { cls->GetName(kNoContext); }));
 }
 
 TEST_F(OddNamespaceTest, ExceptionsOfAComparedNamespacePassUnchanged)
@@ -186,7 +186,7 @@ TEST(UnownedNamespaceTest, ANamespaceThatNobodyOwnsCannotWrap)
     TCallContext context;
     context["nsIndex"] = TCIMValue(static_cast<unsigned short>(0));
     EXPECT_THROW(delta.GetClass("Base", context), boost::bad_weak_ptr);
-    EXPECT_EQ("KALMO_Delta", delta.GetClass("KALMO_Delta", context)->GetName(kNone));
+    EXPECT_EQ("KALMO_Delta", delta.GetClass("KALMO_Delta", context)->GetName(kNoContext));
 }
 
 TEST(SpellingTest, TwoSpellingsGiveTwoWrappersOfOneClass)
@@ -199,7 +199,7 @@ TEST(SpellingTest, TwoSpellingsGiveTwoWrappersOfOneClass)
     const auto declared = comparison.Delta().GetClass("Disk", context);
     const auto shouted = comparison.Delta().GetClass("DISK", context);
     EXPECT_NE(declared, shouted);
-    EXPECT_EQ("Disk", shouted->GetName(kNone));
+    EXPECT_EQ("Disk", shouted->GetName(kNoContext));
     EXPECT_EQ(2u, TTestAccess::ClassCache(comparison.Delta())[0].size());
 }
 

@@ -85,10 +85,10 @@ class PassedFailuresTest : public TDeltaFixture {
     {
         const auto callback = [](boost::shared_ptr<ICIMInstance>) { return true; };
         std::string text;
-        EXPECT_EQ(expected, Thrown([&] { Delta().GetInstance(TCIMReference(), kNone); }));
-        EXPECT_EQ(expected, Thrown([&] { Delta().DeleteInstance(TCIMReference(), kNone); }));
-        EXPECT_EQ(expected, Thrown([&] { Delta().ModifyInstance(TCIMReference(), kNone, kNone); }));
-        EXPECT_EQ(expected, Thrown([&] { Delta().ExecuteQuery(callback, text, text, kNone); }));
+        EXPECT_EQ(expected, Thrown([&] { Delta().GetInstance(TCIMReference(), kNoContext); }));
+        EXPECT_EQ(expected, Thrown([&] { Delta().DeleteInstance(TCIMReference(), kNoContext); }));
+        EXPECT_EQ(expected, Thrown([&] { Delta().ModifyInstance(TCIMReference(), kNoContext, kNoContext); }));
+        EXPECT_EQ(expected, Thrown([&] { Delta().ExecuteQuery(callback, text, text, kNoContext); }));
     }
 
     const boost::shared_ptr<ICIMNamespace> fWithStatus;

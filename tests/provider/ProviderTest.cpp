@@ -29,10 +29,10 @@ TEST(ProviderTest, LoadingTheLibraryRegistersDeltaAndNothingElse)
 TEST(ProviderTest, TellsItsNameAndKind)
 {
     const auto provider = TDeltaNamespaceProvider::GetInstance();
-    EXPECT_EQ("delta", provider->GetName(kNone));
-    EXPECT_EQ(&provider->GetName(kNone), &provider->GetName(kNone));
-    EXPECT_EQ(1, provider->GetType(kNone));
-    EXPECT_FALSE(provider->IsIndicationsSupported(kNone));
+    EXPECT_EQ("delta", provider->GetName(kNoContext));
+    EXPECT_EQ(&provider->GetName(kNoContext), &provider->GetName(kNoContext));
+    EXPECT_EQ(1, provider->GetType(kNoContext));
+    EXPECT_FALSE(provider->IsIndicationsSupported(kNoContext));
 }
 
 TEST(ProviderTest, ThereIsOneProvider)
@@ -51,8 +51,8 @@ TEST(ProviderTest, InitializeSucceedsWhateverTheManagerAnswers)
 
 TEST(ProviderTest, EachNamespaceIsIndependent)
 {
-    const auto first = Allocate(kNone, false, "root/delta");
-    const auto second = Allocate(kNone, false, "root/delta");
+    const auto first = Allocate(kNoContext, false, "root/delta");
+    const auto second = Allocate(kNoContext, false, "root/delta");
     ASSERT_TRUE(first && second);
     EXPECT_NE(first, second);
     EXPECT_NE(TTestAccess::Store(*first), TTestAccess::Store(*second));
@@ -71,7 +71,7 @@ TEST(ProviderTest, ArgumentsMakeNoDifference)
             const auto ns = Allocate(context, flag, name);
             ASSERT_TRUE(ns);
             EXPECT_EQ(0, ns->NumContainers());
-            EXPECT_EQ("KALMO_Delta", ns->GetClass("KALMO_Delta", kNone)->GetName(kNone));
+            EXPECT_EQ("KALMO_Delta", ns->GetClass("KALMO_Delta", kNoContext)->GetName(kNoContext));
         }
     }
 }
@@ -90,14 +90,14 @@ TEST(ProviderTest, TheHostLoadsTheSchemaIntoNamespacesOfInmemAlone)
 
 TEST(ProviderTest, TheSchemaDeclaresWhatRecordsAreMadeOf)
 {
-    const auto ns = Allocate(kNone, false, "");
+    const auto ns = Allocate(kNoContext, false, "");
     const std::vector<std::pair<std::string, std::vector<std::string>>> classes = {
         {"KALMO_DeltaClass", {"ClassName"}},
         {"KALMO_Delta", {"Type", "InstanceName", "Property", "NamespaceIndices"}},
         {"KALMO_DeltaClassAssocToDelta", {"Class", "Delta"}}};
     for (const auto& [className, properties] : classes) {
         for (const auto& property : properties) {
-            EXPECT_EQ(property, ns->GetClass(className, kNone)->GetPropertyDecl(property, kNone)->GetName(kNone));
+            EXPECT_EQ(property, ns->GetClass(className, kNoContext)->GetPropertyDecl(property, kNoContext)->GetName(kNoContext));
         }
     }
 }

@@ -25,7 +25,7 @@ class StoreAccessTest : public TDeltaFixture {
 
 TEST_F(StoreAccessTest, TheProviderIsTheOneOfThisLibrary)
 {
-    EXPECT_EQ(TDeltaNamespaceProvider::GetInstance(), Delta().GetNamespaceProvider(kNone));
+    EXPECT_EQ(TDeltaNamespaceProvider::GetInstance(), Delta().GetNamespaceProvider(kNoContext));
     EXPECT_EQ(TDeltaNamespaceProvider::GetInstance(), Delta().GetNamespaceProvider(At(9)));
     EXPECT_EQ("", Watch().TakeText());
 }
@@ -33,7 +33,7 @@ TEST_F(StoreAccessTest, TheProviderIsTheOneOfThisLibrary)
 TEST_F(StoreAccessTest, InstancesComeFromTheStore)
 {
     const auto instance = Delta().GetInstance(fPath, At(2));
-    EXPECT_EQ("Disk", instance->GetProperty("ClassName", kNone)->GetValue(kNone).ToText());
+    EXPECT_EQ("Disk", instance->GetProperty("ClassName", kNoContext)->GetValue(kNoContext).ToText());
     EXPECT_EQ(0u, Watch().GetText().find("store.GetInstance(KALMO_DeltaClass.DeltaClassID=1) {nsIndex=2}\n"));
 }
 
@@ -41,7 +41,7 @@ TEST_F(StoreAccessTest, InstancesAreDeletedFromTheStore)
 {
     Delta().DeleteInstance(fPath, At(1));
     EXPECT_EQ("store.DeleteInstance(KALMO_DeltaClass.DeltaClassID=1) {nsIndex=1}\n", Watch().TakeText());
-    EXPECT_EQ(15, StatusOf([&] { Delta().GetInstance(fPath, kNone); }));
+    EXPECT_EQ(15, StatusOf([&] { Delta().GetInstance(fPath, kNoContext); }));
 }
 
 TEST_F(StoreAccessTest, InstancesAreModifiedInTheStore)
@@ -50,7 +50,7 @@ TEST_F(StoreAccessTest, InstancesAreModifiedInTheStore)
     properties["ClassName"] = TCIMValue("Card");
     Delta().ModifyInstance(fPath, properties, At(1));
     EXPECT_EQ("store.ModifyInstance(KALMO_DeltaClass.DeltaClassID=1, {ClassName=\"Card\"}) {nsIndex=1}\n", Watch().TakeText());
-    EXPECT_EQ("Card", Delta().GetInstance(fPath, kNone)->GetProperty("ClassName", kNone)->GetValue(kNone).ToText());
+    EXPECT_EQ("Card", Delta().GetInstance(fPath, kNoContext)->GetProperty("ClassName", kNoContext)->GetValue(kNoContext).ToText());
     EXPECT_EQ(1u, properties.size());
 }
 
@@ -95,7 +95,7 @@ TEST_F(StoreAccessTest, ClearInstancesClearsNothing)
 {
     Delta().ClearInstances();
     EXPECT_EQ("", Watch().TakeText());
-    EXPECT_NE(nullptr, Delta().GetInstance(fPath, kNone));
+    EXPECT_NE(nullptr, Delta().GetInstance(fPath, kNoContext));
 }
 
 class QualifierAccessTest : public TDeltaFixture {
@@ -107,14 +107,14 @@ TEST_F(QualifierAccessTest, ADeclarationComesFromTheNamespaceThatTheIndexNames)
 {
     const auto decl = Delta().GetQualifierDecl("Key", At(1));
     EXPECT_EQ("ns1.GetQualifierDecl(\"Key\") {nsIndex=1}\n", Watch().TakeText());
-    EXPECT_EQ(fComparison.Namespace(1).GetNamespace()->GetQualifierDecl("Key", kNone), decl);
+    EXPECT_EQ(fComparison.Namespace(1).GetNamespace()->GetQualifierDecl("Key", kNoContext), decl);
     EXPECT_EQ(15, StatusOf([&] { Delta().GetQualifierDecl("Nowhere", At(1)); }));
 }
 
 TEST_F(QualifierAccessTest, DeclarationsAreEnumeratedWithTheCallersCallback)
 {
     std::string names;
-    const auto collect = [&](boost::shared_ptr<ICIMQualifierDecl> decl) { return names += decl->GetName(kNone), true; };
+    const auto collect = [&](boost::shared_ptr<ICIMQualifierDecl> decl) { return names += decl->GetName(kNoContext), true; };
     Delta().EnumerateQualifierDecls(collect, At(2));
     EXPECT_EQ("Key", names);
     EXPECT_EQ("ns2.EnumerateQualifierDecls() {nsIndex=2}\n", Watch().TakeText());
@@ -122,8 +122,8 @@ TEST_F(QualifierAccessTest, DeclarationsAreEnumeratedWithTheCallersCallback)
 
 TEST_F(QualifierAccessTest, WithoutAnIndexNoNamespaceIsTouched)
 {
-    EXPECT_EQ(38, StatusOf([&] { Delta().GetQualifierDecl("Key", kNone); }));
-    EXPECT_EQ(38, StatusOf([&] { Delta().EnumerateQualifierDecls(&Take, kNone); }));
+    EXPECT_EQ(38, StatusOf([&] { Delta().GetQualifierDecl("Key", kNoContext); }));
+    EXPECT_EQ(38, StatusOf([&] { Delta().EnumerateQualifierDecls(&Take, kNoContext); }));
     EXPECT_EQ("", Watch().TakeText());
 }
 

@@ -5,6 +5,6 @@
 namespace NORVZEL20 {
 
 /// The empty context, with which most tests call.
-inline const TCallContext kNone;
+inline const TCallContext kNoContext;
 
 }  // namespace NORVZEL20

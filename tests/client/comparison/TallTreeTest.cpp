@@ -54,10 +54,9 @@ TEST_F(TallTreeTest, InventoriesWhoseTreesJoinBeyondTheLimitAreRefused)
     const std::string lower = Scratch("lower.xml", Chain(0, 600));
     const std::string upper = Scratch("upper.xml", Chain(600, 1200));
     const std::string complaint = Complaint({"compare", lower, upper});
-    EXPECT_EQ(
-        "cimdelta: lower.xml: class C1001 of upper.xml cannot be declared here: it would have more than 1000 superclasses; "
-        "flatten the class tree\n",
-        Shorten(Shorten(complaint.substr(complaint.rfind("cimdelta: ")), lower, "lower.xml"), upper, "upper.xml"));
+    EXPECT_EQ("cimdelta: lower.xml: class C1001 of upper.xml cannot be declared here: it would have more than 1000 superclasses; "
+              "flatten the class tree\n",
+              Shorten(Shorten(complaint.substr(complaint.rfind("cimdelta: ")), lower, "lower.xml"), upper, "upper.xml"));
 }
 
 TEST_F(TallTreeTest, InventoriesWhosePropertiesJoinBeyondTheLimitAreRefused)

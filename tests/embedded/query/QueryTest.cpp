@@ -49,10 +49,10 @@ class QueryTest : public TInMemFixture {
         std::string ids;
         fNamespace->ExecuteQuery(
             [&](boost::shared_ptr<ICIMInstance> instance) {
-                ids += (ids.empty() ? "" : " ") + instance->GetProperty("Id", kNone)->GetValue(kNone).ToText();
+                ids += (ids.empty() ? "" : " ") + instance->GetProperty("Id", kNoContext)->GetValue(kNoContext).ToText();
                 return true;
             },
-            language, query, kNone);
+            language, query, kNoContext);
         return ids;
     }
 

@@ -27,7 +27,7 @@ class EnumerationTest : public TDevicesFixture {
         DeclareMembers();
         for (const char* const name : {"Units", "Version", "Key"}) {
             fNamespace->AllocateQualifierDecl(name, TCIMValue(false), ICIMQualifierDecl::kScopeAny,
-                                              ICIMQualifierDecl::kFlavorDefault, kNone);
+                                              ICIMQualifierDecl::kFlavorDefault, kNoContext);
         }
         fCabinet =
             Declare("Cabinet", nullptr,
@@ -36,8 +36,8 @@ class EnumerationTest : public TDevicesFixture {
         Associate("Cooling", "Fan");
         Associate("Mounting", "Cabinet");
         for (const TClassPointer& cls : {fDevice, fDisk, fSolidState, fFan}) {
-            Add(cls, {{"Id", cls->GetName(kNone) + "1"}});
-            Add(cls, {{"Id", cls->GetName(kNone) + "2"}});
+            Add(cls, {{"Id", cls->GetName(kNoContext) + "1"}});
+            Add(cls, {{"Id", cls->GetName(kNoContext) + "2"}});
         }
         fMounted = Add(fCabinet, {{"Row", TCIMValue(3U)}, {"Place", TCIMValue(4U)}, {"Side", "front"}});
     }
@@ -48,9 +48,9 @@ class EnumerationTest : public TDevicesFixture {
             fDevice->AddPropertyDecl(Decl({name, TType::kUint32, {"Static"}}));
         }
         fDisk->AddPropertyDecl(Decl({"Spare", TType::kUint32, {"Static"}}));
-        fDevice->AddMethodDecl(fDevice->AllocateMethodDecl("Start", TType::kUint32, kNone));
-        fDevice->AddMethodDecl(fDevice->AllocateMethodDecl("Stop", TType::kUint32, kNone));
-        fDisk->AddMethodDecl(fDisk->AllocateMethodDecl("Format", TType::kUint32, kNone));
+        fDevice->AddMethodDecl(fDevice->AllocateMethodDecl("Start", TType::kUint32, kNoContext));
+        fDevice->AddMethodDecl(fDevice->AllocateMethodDecl("Stop", TType::kUint32, kNoContext));
+        fDisk->AddMethodDecl(fDisk->AllocateMethodDecl("Format", TType::kUint32, kNoContext));
         fDevice->AddQualifier(Qualifier("Version"));
         fDevice->AddQualifier(Qualifier("Units"));
         fDisk->AddQualifier(Qualifier("Revised"));
@@ -63,50 +63,51 @@ class EnumerationTest : public TDevicesFixture {
         association->AddQualifier(Qualifier("Association"));
         association->AddPropertyDecl(Reference("Thing", "Device"));
         association->AddPropertyDecl(Reference("Other", className));
-        association->AddToNamespace(kNone);
+        association->AddToNamespace(kNoContext);
     }
 
     std::vector<TEnumeration> OfTheNamespace()
     {
         return {
-            {"root classes", 6, [&](auto& goOn) { fNamespace->EnumerateRootClasses(Ask(goOn), kNone); }},
-            {"qualifier declarations", 3, [&](auto& goOn) { fNamespace->EnumerateQualifierDecls(Ask(goOn), kNone); }},
+            {"root classes", 6, [&](auto& goOn) { fNamespace->EnumerateRootClasses(Ask(goOn), kNoContext); }},
+            {"qualifier declarations", 3, [&](auto& goOn) { fNamespace->EnumerateQualifierDecls(Ask(goOn), kNoContext); }},
             {"answers of a query", 8, [&](auto& goOn) { Query("SELECT * FROM Device", goOn); }},
             {"answers of a query with a condition", 4, [&](auto& goOn) { Query("SELECT * FROM Device WHERE Id LIKE '%2'", goOn); }},
-            {"classes below the pseudo-class", 6, [&](auto& goOn) { Root()->EnumerateSubClasses(Ask(goOn), false, kNone); }},
-            {"all classes", 9, [&](auto& goOn) { Root()->EnumerateSubClasses(Ask(goOn), true, kNone); }},
-            {"all instances", 9, [&](auto& goOn) { Root()->EnumerateInstances(Ask(goOn), true, kNone); }},
+            {"classes below the pseudo-class", 6, [&](auto& goOn) { Root()->EnumerateSubClasses(Ask(goOn), false, kNoContext); }},
+            {"all classes", 9, [&](auto& goOn) { Root()->EnumerateSubClasses(Ask(goOn), true, kNoContext); }},
+            {"all instances", 9, [&](auto& goOn) { Root()->EnumerateInstances(Ask(goOn), true, kNoContext); }},
         };
     }
 
     std::vector<TEnumeration> OfAClass()
     {
         return {
-            {"subclasses", 3, [&](auto& goOn) { fDevice->EnumerateSubClasses(Ask(goOn), true, kNone); }},
-            {"associated classes", 3, [&](auto& goOn) { fDevice->EnumerateAssociatedClasses(Ask(goOn), "", "", "", "", kNone); }},
-            {"association classes", 3, [&](auto& goOn) { fDevice->EnumerateAssociationClasses(Ask(goOn), "", "", kNone); }},
-            {"key names", 3, [&](auto& goOn) { fCabinet->EnumerateKeyNames(Ask(goOn), kNone); }},
-            {"property declarations", 6, [&](auto& goOn) { fSolidState->EnumeratePropertyDecls(Ask(goOn), kNone); }},
-            {"static properties", 3, [&](auto& goOn) { fSolidState->EnumerateStaticProperties(Ask(goOn), kNone); }},
-            {"instances", 2, [&](auto& goOn) { fDevice->EnumerateInstances(Ask(goOn), false, kNone); }},
-            {"instances of subclasses too", 8, [&](auto& goOn) { fDevice->EnumerateInstances(Ask(goOn), true, kNone); }},
-            {"method declarations", 3, [&](auto& goOn) { fSolidState->EnumerateMethodDecls(Ask(goOn), kNone); }},
-            {"qualifiers, inherited ones too", 4, [&](auto& goOn) { fDisk->EnumerateQualifiers(Ask(goOn), kNone); }},
+            {"subclasses", 3, [&](auto& goOn) { fDevice->EnumerateSubClasses(Ask(goOn), true, kNoContext); }},
+            {"associated classes", 3,
+             [&](auto& goOn) { fDevice->EnumerateAssociatedClasses(Ask(goOn), "", "", "", "", kNoContext); }},
+            {"association classes", 3, [&](auto& goOn) { fDevice->EnumerateAssociationClasses(Ask(goOn), "", "", kNoContext); }},
+            {"key names", 3, [&](auto& goOn) { fCabinet->EnumerateKeyNames(Ask(goOn), kNoContext); }},
+            {"property declarations", 6, [&](auto& goOn) { fSolidState->EnumeratePropertyDecls(Ask(goOn), kNoContext); }},
+            {"static properties", 3, [&](auto& goOn) { fSolidState->EnumerateStaticProperties(Ask(goOn), kNoContext); }},
+            {"instances", 2, [&](auto& goOn) { fDevice->EnumerateInstances(Ask(goOn), false, kNoContext); }},
+            {"instances of subclasses too", 8, [&](auto& goOn) { fDevice->EnumerateInstances(Ask(goOn), true, kNoContext); }},
+            {"method declarations", 3, [&](auto& goOn) { fSolidState->EnumerateMethodDecls(Ask(goOn), kNoContext); }},
+            {"qualifiers, inherited ones too", 4, [&](auto& goOn) { fDisk->EnumerateQualifiers(Ask(goOn), kNoContext); }},
         };
     }
 
     std::vector<TEnumeration> OfAnInstance()
     {
         return {
-            {"properties", 3, [&](auto& goOn) { fMounted->EnumerateProperties(Ask(goOn), kNone); }},
-            {"key bindings", 3, [&](auto& goOn) { fMounted->GetReference(kNone).EnumerateKeyBindings(Ask(goOn)); }},
+            {"properties", 3, [&](auto& goOn) { fMounted->EnumerateProperties(Ask(goOn), kNoContext); }},
+            {"key bindings", 3, [&](auto& goOn) { fMounted->GetReference(kNoContext).EnumerateKeyBindings(Ask(goOn)); }},
         };
     }
 
     void Query(std::string query, const std::function<bool()>& goOn)
     {
         std::string language = "WQL";
-        fNamespace->ExecuteQuery(Ask(goOn), language, query, kNone);
+        fNamespace->ExecuteQuery(Ask(goOn), language, query, kNoContext);
     }
 
     // Runs each enumeration several times: once ended at each of its elements, and once to its end.

@@ -25,7 +25,7 @@ TEST_F(InMemClassChangeTest, PropertiesThatComeLateComeInTheOrderOfThoseThatCome
     EXPECT_EQ("Id Serial Weight Size Blocks Wear", PropertiesOf(*fSolidState));
     EXPECT_EQ("Id Weight", KeysOf(*reel));
     EXPECT_EQ("Id Weight", KeysOf(*fSolidState));
-    EXPECT_EQ(tape, boost::dynamic_pointer_cast<TInMemPropertyDecl>(reel->GetPropertyDecl("Serial", kNone))->GetOwner());
+    EXPECT_EQ(tape, boost::dynamic_pointer_cast<TInMemPropertyDecl>(reel->GetPropertyDecl("Serial", kNoContext))->GetOwner());
     EXPECT_EQ("Id=r1 Serial=NULL Weight=NULL Speed=NULL Blades=NULL Length=NULL Width=7",
               ValuesOf(*Allocate(reel, {{"Id", "r1"}, {"Width", TCIMValue(static_cast<std::uint8_t>(7))}})));
 }
@@ -34,7 +34,7 @@ TEST_F(InMemClassChangeTest, ASubclassThatIsDeclaredLateHasWhatItsSuperclassGotM
 {
     const auto tape = Allocate("Tape", fDevice, {{"Length", TType::kUint32, {}}});
     fDevice->AddPropertyDecl(Decl({"Serial", TType::kString, {}}));
-    tape->AddToNamespace(kNone);
+    tape->AddToNamespace(kNoContext);
     EXPECT_EQ("Id Serial Length", PropertiesOf(*tape));
 }
 
@@ -42,9 +42,9 @@ TEST_F(InMemClassChangeTest, ASubclassThatIsDeclaredLateHasNotWhatItsSuperclassL
 {
     const auto tape = Allocate("Tape", fDisk, {{"Length", TType::kUint32, {}}, {"SIZE", TType::kUint64, {}}});
     const auto reel = Allocate("Reel", fDisk, {{"Width", TType::kUint32, {}}});
-    fDisk->RemovePropertyDecl(fDisk->GetPropertyDecl("Size", kNone));
-    tape->AddToNamespace(kNone);
-    reel->AddToNamespace(kNone);
+    fDisk->RemovePropertyDecl(fDisk->GetPropertyDecl("Size", kNoContext));
+    tape->AddToNamespace(kNoContext);
+    reel->AddToNamespace(kNoContext);
     EXPECT_EQ("Id Length SIZE", PropertiesOf(*tape));
     EXPECT_EQ("Id Width", PropertiesOf(*reel));
     EXPECT_EQ(nullptr, reel->FindPropertyDecl("Size"));
@@ -53,20 +53,20 @@ TEST_F(InMemClassChangeTest, ASubclassThatIsDeclaredLateHasNotWhatItsSuperclassL
 TEST_F(InMemClassChangeTest, AMethodOfASubclassThatIsDeclaredLateOverridesOneThatIsNewAbove)
 {
     const auto tape = Allocate("Tape", fDevice);
-    tape->AddMethodDecl(tape->AllocateMethodDecl("Reset", TType::kUint32, kNone));
-    fDevice->AddMethodDecl(fDevice->AllocateMethodDecl("Reset", TType::kUint32, kNone));
-    tape->AddToNamespace(kNone);
-    EXPECT_EQ("Reset", NamesOf<ICIMMethodDecl>([&](const auto& callback) { tape->EnumerateMethodDecls(callback, kNone); }));
+    tape->AddMethodDecl(tape->AllocateMethodDecl("Reset", TType::kUint32, kNoContext));
+    fDevice->AddMethodDecl(fDevice->AllocateMethodDecl("Reset", TType::kUint32, kNoContext));
+    tape->AddToNamespace(kNoContext);
+    EXPECT_EQ("Reset", NamesOf<ICIMMethodDecl>([&](const auto& callback) { tape->EnumerateMethodDecls(callback, kNoContext); }));
 }
 
 TEST_F(InMemClassChangeTest, AnOverrideKeepsItsPlaceAndInheritsTheKey)
 {
     const auto tape = Allocate("Tape", fDevice, {{"Length", TType::kUint32, {}}, {"ID", TType::kString, {"Upper"}}});
-    tape->AddToNamespace(kNone);
+    tape->AddToNamespace(kNoContext);
     EXPECT_EQ("ID Length", PropertiesOf(*tape));
     EXPECT_EQ("ID", KeysOf(*tape));
-    EXPECT_EQ("Upper Key", QualifiersOf(*tape->GetPropertyDecl("id", kNone)));
-    EXPECT_EQ("Key", QualifiersOf(*fDevice->GetPropertyDecl("id", kNone)));
+    EXPECT_EQ("Upper Key", QualifiersOf(*tape->GetPropertyDecl("id", kNoContext)));
+    EXPECT_EQ("Key", QualifiersOf(*fDevice->GetPropertyDecl("id", kNoContext)));
 }
 
 TEST_F(InMemClassChangeTest, AnOverrideOfAnotherTypeIsRefusedFromAboveAndBelow)
@@ -81,8 +81,8 @@ TEST_F(InMemClassChangeTest, ASuperclassThatGotAnotherTypeMeanwhileKeepsAClassOu
 {
     const auto tape = Allocate("Tape", fDevice, {{"Length", TType::kUint32, {}}});
     fDevice->AddPropertyDecl(Decl({"Length", TType::kUint64, {}}));
-    EXPECT_EQ(TZELStatusCode::kTypeMismatch, StatusOf([&] { tape->Validate(kNone); }));
-    EXPECT_EQ(TZELStatusCode::kTypeMismatch, StatusOf([&] { tape->AddToNamespace(kNone); }));
+    EXPECT_EQ(TZELStatusCode::kTypeMismatch, StatusOf([&] { tape->Validate(kNoContext); }));
+    EXPECT_EQ(TZELStatusCode::kTypeMismatch, StatusOf([&] { tape->AddToNamespace(kNoContext); }));
     EXPECT_EQ("Disk Fan", SubClassesOf(*fDevice, false));
 }
 
@@ -97,14 +97,14 @@ TEST_F(InMemClassChangeTest, ADeclarationBelongsToOneClassAndStandsThereOnce)
 
 TEST_F(InMemClassChangeTest, ARemovedPropertyGoesFromAllBelowAndMayComeBack)
 {
-    const auto size = fDisk->GetPropertyDecl("Size", kNone);
+    const auto size = fDisk->GetPropertyDecl("Size", kNoContext);
     const auto instance = Add(fSolidState, {{"Id", "sda"}, {"Size", Uint64(5)}});
     EXPECT_FALSE(fSolidState->RemovePropertyDecl(size));
     EXPECT_TRUE(fDisk->RemovePropertyDecl(size));
     EXPECT_FALSE(fDisk->RemovePropertyDecl(size));
     EXPECT_EQ("Id Wear", PropertiesOf(*fSolidState));
     EXPECT_EQ("Id=sda Wear=NULL", ValuesOf(*instance));
-    EXPECT_EQ(TZELStatusCode::kNotFound, StatusOf([&] { instance->GetProperty("Size", kNone); }));
+    EXPECT_EQ(TZELStatusCode::kNotFound, StatusOf([&] { instance->GetProperty("Size", kNoContext); }));
     EXPECT_TRUE(fDisk->AddPropertyDecl(Decl({"Size", TType::kString, {}})));
     EXPECT_EQ("Id=sda Size=NULL Wear=NULL", ValuesOf(*instance));
 }
@@ -113,15 +113,15 @@ TEST_F(InMemClassChangeTest, RemovingAnOverrideBringsBackWhatItOverrode)
 {
     const auto own = Decl({"Id", TType::kString, {"Upper"}});
     fDisk->AddPropertyDecl(own);
-    EXPECT_EQ("Upper Key", QualifiersOf(*fSolidState->GetPropertyDecl("Id", kNone)));
+    EXPECT_EQ("Upper Key", QualifiersOf(*fSolidState->GetPropertyDecl("Id", kNoContext)));
     Add(fDisk, {{"Id", "sda"}});
     EXPECT_TRUE(fDisk->RemovePropertyDecl(own));
-    EXPECT_EQ("Key", QualifiersOf(*fSolidState->GetPropertyDecl("Id", kNone)));
+    EXPECT_EQ("Key", QualifiersOf(*fSolidState->GetPropertyDecl("Id", kNoContext)));
 }
 
 TEST_F(InMemClassChangeTest, AKeyOfAClassWithInstancesStays)
 {
-    const auto key = fDevice->GetPropertyDecl("Id", kNone);
+    const auto key = fDevice->GetPropertyDecl("Id", kNoContext);
     Add(fFan, {{"Id", "fan0"}});
     EXPECT_EQ(TZELStatusCode::kClassInUse, StatusOf([&] { fDevice->RemovePropertyDecl(key); }));
     EXPECT_EQ("Id", KeysOf(*fFan));
@@ -149,21 +149,21 @@ TEST_F(InMemClassChangeTest, AnOverrideThatRepeatsTheKeyMayGo)
     const auto own = Decl({"Id", TType::kString, {"Key"}});
     fDisk->AddPropertyDecl(own);
     Add(fDisk, {{"Id", "sda"}});
-    EXPECT_EQ(TZELStatusCode::kSuccess, StatusOf([&] { own->AddQualifier(Qualifier("Key", TCIMValue(false)), kNone); }));
+    EXPECT_EQ(TZELStatusCode::kSuccess, StatusOf([&] { own->AddQualifier(Qualifier("Key", TCIMValue(false)), kNoContext); }));
     EXPECT_TRUE(fDisk->RemovePropertyDecl(own));
     EXPECT_EQ("Id", KeysOf(*fDisk));
 }
 
 TEST_F(InMemClassChangeTest, AKeyCannotBeRevokedWhileThereAreInstances)
 {
-    const auto id = fDevice->GetPropertyDecl("Id", kNone);
+    const auto id = fDevice->GetPropertyDecl("Id", kNoContext);
     Add(fFan, {{"Id", "fan0"}});
-    EXPECT_EQ(TZELStatusCode::kClassInUse, StatusOf([&] { id->AddQualifier(Qualifier("KEY", TCIMValue(false)), kNone); }));
+    EXPECT_EQ(TZELStatusCode::kClassInUse, StatusOf([&] { id->AddQualifier(Qualifier("KEY", TCIMValue(false)), kNoContext); }));
     EXPECT_EQ("Id", KeysOf(*fFan));
     EXPECT_EQ("Key", QualifiersOf(*id));
-    EXPECT_EQ(TZELStatusCode::kSuccess, StatusOf([&] { id->AddQualifier(Qualifier("Key"), kNone); }));
+    EXPECT_EQ(TZELStatusCode::kSuccess, StatusOf([&] { id->AddQualifier(Qualifier("Key"), kNoContext); }));
     fNamespace->ClearInstances();
-    EXPECT_EQ(TZELStatusCode::kSuccess, StatusOf([&] { id->AddQualifier(Qualifier("Key", TCIMValue(false)), kNone); }));
+    EXPECT_EQ(TZELStatusCode::kSuccess, StatusOf([&] { id->AddQualifier(Qualifier("Key", TCIMValue(false)), kNoContext); }));
     EXPECT_EQ("", KeysOf(*fFan));
 }
 
@@ -172,25 +172,26 @@ TEST_F(InMemClassChangeTest, AKeyThatComesLateLeavesInstancesToBeFound)
     const auto instance = Add(fRoom, {{"Name", "hall"}});
     fRoom->AddPropertyDecl(Decl({"Floor", TType::kUint8, {"Key"}}));
     EXPECT_EQ("root/cimv2:Room.Floor=NULL,Name=\"hall\"", instance->GetReference().GetPath());
-    EXPECT_EQ(instance, fNamespace->GetInstance(instance->GetReference(), kNone));
-    EXPECT_EQ(TZELStatusCode::kKeyMissing, StatusOf([&] { fNamespace->GetInstance(Path("Room.Name=\"hall\""), kNone); }));
+    EXPECT_EQ(instance, fNamespace->GetInstance(instance->GetReference(), kNoContext));
+    EXPECT_EQ(TZELStatusCode::kKeyMissing, StatusOf([&] { fNamespace->GetInstance(Path("Room.Name=\"hall\""), kNoContext); }));
 }
 
 TEST_F(InMemClassChangeTest, AQualifierThatComesLateCountsAtOnce)
 {
-    fDisk->GetPropertyDecl("Size", kNone)->AddQualifier(Qualifier("Key"), kNone);
+    fDisk->GetPropertyDecl("Size", kNoContext)->AddQualifier(Qualifier("Key"), kNoContext);
     EXPECT_EQ("Id Size", KeysOf(*fSolidState));
 }
 
 TEST_F(InMemClassChangeTest, APropertyThatBecomesAKeyLeavesInstancesOfSubclassesToBeFound)
 {
     const auto instance = Add(fSolidState, {{"Id", "sda"}, {"Size", Uint64(7)}});
-    fDisk->GetPropertyDecl("Size", kNone)->AddQualifier(Qualifier("Key"), kNone);
-    EXPECT_EQ(instance, fNamespace->GetInstance(Path("SolidState.Id=\"sda\",Size=7"), kNone));
-    EXPECT_EQ(TZELStatusCode::kNotFound, StatusOf([&] { fNamespace->GetInstance(Path("SolidState.Id=\"sda\",Size=8"), kNone); }));
+    fDisk->GetPropertyDecl("Size", kNoContext)->AddQualifier(Qualifier("Key"), kNoContext);
+    EXPECT_EQ(instance, fNamespace->GetInstance(Path("SolidState.Id=\"sda\",Size=7"), kNoContext));
+    EXPECT_EQ(TZELStatusCode::kNotFound,
+              StatusOf([&] { fNamespace->GetInstance(Path("SolidState.Id=\"sda\",Size=8"), kNoContext); }));
     EXPECT_EQ(TZELStatusCode::kAlreadyExists, StatusOf([&] { Add(fSolidState, {{"Id", "sda"}, {"Size", Uint64(7)}}); }));
     Add(fSolidState, {{"Id", "sda"}, {"Size", Uint64(8)}});
-    fNamespace->DeleteInstance(Path("SolidState.Id=\"sda\",Size=7"), kNone);
+    fNamespace->DeleteInstance(Path("SolidState.Id=\"sda\",Size=7"), kNoContext);
     EXPECT_EQ("SolidState.Id=\"sda\",Size=8\n", InstancesOf(*fSolidState));
 }
 
@@ -209,34 +210,34 @@ TEST_F(InMemClassChangeTest, AReferenceToAClassIsFoundInItsNewSpelling)
     const TCIMReference hall = Add(fRoom, {{"Name", "hall"}})->GetReference();
     const auto instance = Add(cls, {{"Where", TCIMValue(hall)}});
     fRoom->SetSpelling("ROOM");
-    EXPECT_EQ(instance, fNamespace->GetInstance(instance->GetReference(), kNone));
+    EXPECT_EQ(instance, fNamespace->GetInstance(instance->GetReference(), kNoContext));
 }
 
 TEST_F(InMemClassChangeTest, AddingAClassFailsForATakenNameAndForSuperclassesNotDeclaredHere)
 {
     const auto tape = Allocate("Tape", fDevice);
-    EXPECT_EQ(TZELStatusCode::kNotFound, StatusOf([&] { Allocate("SmallTape", tape)->AddToNamespace(kNone); }));
+    EXPECT_EQ(TZELStatusCode::kNotFound, StatusOf([&] { Allocate("SmallTape", tape)->AddToNamespace(kNoContext); }));
     EXPECT_EQ(TZELStatusCode::kAlreadyExists, StatusOf([&] { Declare("DISK", nullptr); }));
-    EXPECT_EQ(TZELStatusCode::kAlreadyExists, StatusOf([&] { Allocate("DISK", nullptr)->Validate(kNone); }));
-    EXPECT_EQ(TZELStatusCode::kAlreadyExists, StatusOf([&] { fDisk->AddToNamespace(kNone); }));
-    EXPECT_EQ(TZELStatusCode::kInvalidParameter, StatusOf([&] { fNamespace->AllocateClass("", nullptr, kNone); }));
-    EXPECT_EQ(TZELStatusCode::kInvalidParameter, StatusOf([&] { fNamespace->AllocateClass("<root>", nullptr, kNone); }));
+    EXPECT_EQ(TZELStatusCode::kAlreadyExists, StatusOf([&] { Allocate("DISK", nullptr)->Validate(kNoContext); }));
+    EXPECT_EQ(TZELStatusCode::kAlreadyExists, StatusOf([&] { fDisk->AddToNamespace(kNoContext); }));
+    EXPECT_EQ(TZELStatusCode::kInvalidParameter, StatusOf([&] { fNamespace->AllocateClass("", nullptr, kNoContext); }));
+    EXPECT_EQ(TZELStatusCode::kInvalidParameter, StatusOf([&] { fNamespace->AllocateClass("<root>", nullptr, kNoContext); }));
     const auto other = TInMemNamespace::Create("other");
-    EXPECT_EQ(TZELStatusCode::kInvalidParameter, StatusOf([&] { other->AllocateClass("Tape", fDisk, kNone); }));
+    EXPECT_EQ(TZELStatusCode::kInvalidParameter, StatusOf([&] { other->AllocateClass("Tape", fDisk, kNoContext); }));
     EXPECT_EQ("Device Disk SolidState Fan Room", SubClassesOf(*Root(), true));
 }
 
 TEST_F(InMemClassChangeTest, AClassGoesWhenNothingDependsOnIt)
 {
     const auto instance = Add(fSolidState, {{"Id", "sda"}});
-    EXPECT_EQ(TZELStatusCode::kClassInUse, StatusOf([&] { fDisk->RemoveFromNamespace(kNone); }));
-    EXPECT_EQ(TZELStatusCode::kClassInUse, StatusOf([&] { fSolidState->RemoveFromNamespace(kNone); }));
+    EXPECT_EQ(TZELStatusCode::kClassInUse, StatusOf([&] { fDisk->RemoveFromNamespace(kNoContext); }));
+    EXPECT_EQ(TZELStatusCode::kClassInUse, StatusOf([&] { fSolidState->RemoveFromNamespace(kNoContext); }));
     fNamespace->ClearInstances();
-    fSolidState->RemoveFromNamespace(kNone);
-    EXPECT_EQ(TZELStatusCode::kNotFound, StatusOf([&] { fSolidState->RemoveFromNamespace(kNone); }));
-    EXPECT_EQ(TZELStatusCode::kNotFound, StatusOf([&] { instance->AddToNamespace(kNone); }));
+    fSolidState->RemoveFromNamespace(kNoContext);
+    EXPECT_EQ(TZELStatusCode::kNotFound, StatusOf([&] { fSolidState->RemoveFromNamespace(kNoContext); }));
+    EXPECT_EQ(TZELStatusCode::kNotFound, StatusOf([&] { instance->AddToNamespace(kNoContext); }));
     EXPECT_EQ("Device Disk Fan Room", SubClassesOf(*Root(), true));
-    fSolidState->AddToNamespace(kNone);
+    fSolidState->AddToNamespace(kNoContext);
     EXPECT_EQ("Device Disk SolidState Fan Room", SubClassesOf(*Root(), true));
 }
 
@@ -257,28 +258,28 @@ TEST_F(InMemClassChangeTest, ModifyClassTakesOverWhatIsMissing)
 {
     const auto more = Allocate("Disk", fDevice, {{"SIZE", TType::kUint64, {}}, {"Model", TType::kString, {"Indexed"}}});
     more->AddQualifier(Qualifier("Version", TCIMValue("3")));
-    more->AddMethodDecl(more->AllocateMethodDecl("Format", TType::kUint32, kNone));
-    fDisk->ModifyClass(more, kNone);
+    more->AddMethodDecl(more->AllocateMethodDecl("Format", TType::kUint32, kNoContext));
+    fDisk->ModifyClass(more, kNoContext);
     EXPECT_EQ("Id Size Model", PropertiesOf(*fDisk));
-    EXPECT_EQ("Indexed", QualifiersOf(*fDisk->GetPropertyDecl("Model", kNone)));
+    EXPECT_EQ("Indexed", QualifiersOf(*fDisk->GetPropertyDecl("Model", kNoContext)));
     EXPECT_EQ("Version", QualifiersOf(*fDisk));
-    EXPECT_EQ("Format", fDisk->GetMethodDecl("Format", kNone)->GetName(kNone));
+    EXPECT_EQ("Format", fDisk->GetMethodDecl("Format", kNoContext)->GetName(kNoContext));
     const auto different = Allocate("Disk", fDevice, {{"First", TType::kString, {}}, {"Size", TType::kString, {}}});
-    EXPECT_EQ(TZELStatusCode::kTypeMismatch, StatusOf([&] { fDisk->ModifyClass(different, kNone); }));
+    EXPECT_EQ(TZELStatusCode::kTypeMismatch, StatusOf([&] { fDisk->ModifyClass(different, kNoContext); }));
     EXPECT_EQ("Id Size Model", PropertiesOf(*fDisk));
 }
 
 TEST_F(InMemClassChangeTest, ModifyClassTakesOverNothingIfASubclassHasAnotherType)
 {
     const auto more = Allocate("Disk", fDevice, {{"Model", TType::kString, {}}, {"Wear", TType::kString, {}}});
-    EXPECT_EQ(TZELStatusCode::kTypeMismatch, StatusOf([&] { fDisk->ModifyClass(more, kNone); }));
+    EXPECT_EQ(TZELStatusCode::kTypeMismatch, StatusOf([&] { fDisk->ModifyClass(more, kNoContext); }));
     EXPECT_EQ("Id Size", PropertiesOf(*fDisk));
 }
 
 TEST_F(InMemClassChangeTest, ANameMayChangeItsLetterCaseAndNothingElse)
 {
     fDisk->SetSpelling("DISK");
-    EXPECT_EQ("DISK", fNamespace->GetClass("disk", kNone)->GetName(kNone));
+    EXPECT_EQ("DISK", fNamespace->GetClass("disk", kNoContext)->GetName(kNoContext));
     EXPECT_EQ(TZELStatusCode::kInvalidParameter, StatusOf([&] { fDisk->SetSpelling("Disc"); }));
     fDisk->FindPropertyDecl("Size")->SetSpelling("size");
     EXPECT_EQ("Id size Wear", PropertiesOf(*fSolidState));

@@ -14,10 +14,10 @@ class InMemInstanceTest : public TInMemFixture {
 
 TEST_F(InMemInstanceTest, StartsWithNullsOfTheDeclaredTypes)
 {
-    const auto instance = fDisk->AllocateInstance(kNone);
+    const auto instance = fDisk->AllocateInstance(kNoContext);
     EXPECT_EQ("Id=NULL Size=NULL Label=NULL Tags=NULL", ValuesOf(*instance));
-    EXPECT_EQ(TType::kUint64, instance->GetProperty("Size", kNone)->GetValue(kNone).GetType());
-    EXPECT_EQ(fDisk, instance->GetClass(kNone));
+    EXPECT_EQ(TType::kUint64, instance->GetProperty("Size", kNoContext)->GetValue(kNoContext).GetType());
+    EXPECT_EQ(fDisk, instance->GetClass(kNoContext));
     EXPECT_EQ("", InstancesOf(*fDisk));
 }
 
@@ -25,8 +25,8 @@ TEST_F(InMemInstanceTest, PropertiesAreFoundInAnyLetterCase)
 {
     const auto instance = Allocate(fDisk, {{"ID", "sda"}, {"size", Uint64(7)}});
     EXPECT_EQ("Id=sda Size=7 Label=NULL Tags=NULL", ValuesOf(*instance));
-    EXPECT_EQ("Size", instance->GetProperty("SIZE", kNone)->GetPropertyDecl(kNone)->GetName(kNone));
-    EXPECT_EQ(TZELStatusCode::kNotFound, StatusOf([&] { instance->GetProperty("Colour", kNone); }));
+    EXPECT_EQ("Size", instance->GetProperty("SIZE", kNoContext)->GetPropertyDecl(kNoContext)->GetName(kNoContext));
+    EXPECT_EQ(TZELStatusCode::kNotFound, StatusOf([&] { instance->GetProperty("Colour", kNoContext); }));
     EXPECT_EQ(nullptr, instance->FindProperty("Colour"));
 }
 
@@ -46,17 +46,17 @@ TEST_F(InMemInstanceTest, ValuesMustHaveTheDeclaredType)
                 {"Size", TCIMValue(), TZELStatusCode::kSuccess},
                 {"Size", TCIMValue::Null(TType::kString), TZELStatusCode::kSuccess}};
     for (const auto& row : rows) {
-        const auto property = instance->GetProperty(row.property, kNone);
-        EXPECT_EQ(row.status, StatusOf([&] { property->SetValue(row.value, kNone); })) << row.property << row.value.ToText();
+        const auto property = instance->GetProperty(row.property, kNoContext);
+        EXPECT_EQ(row.status, StatusOf([&] { property->SetValue(row.value, kNoContext); })) << row.property << row.value.ToText();
     }
-    EXPECT_EQ(TType::kUint64, instance->GetProperty("Size", kNone)->GetValue(kNone).GetType());
+    EXPECT_EQ(TType::kUint64, instance->GetProperty("Size", kNoContext)->GetValue(kNoContext).GetType());
 }
 
 TEST_F(InMemInstanceTest, ARefusedValueLeavesThePropertyAsItWas)
 {
     const auto instance = Allocate(fDisk, {{"Label", "data"}});
     TInMemProperty& label = Property(instance, "Label");
-    EXPECT_EQ(TZELStatusCode::kTypeMismatch, StatusOf([&] { label.SetValue(TCIMValue(1U), kNone); }));
+    EXPECT_EQ(TZELStatusCode::kTypeMismatch, StatusOf([&] { label.SetValue(TCIMValue(1U), kNoContext); }));
     EXPECT_EQ(TZELStatusCode::kTypeMismatch, StatusOf([&] { label.MarkChanged(TCIMValue(1U)); }));
     EXPECT_EQ(TCIMValue("data"), label.GetValue());
     EXPECT_FALSE(label.IsChanged());
@@ -67,7 +67,7 @@ TEST_F(InMemInstanceTest, AStringHoldsAnEmbeddedObject)
 {
     const auto object = boost::make_shared<const TEmbeddedObject>("Partition");
     const auto instance = Allocate(fDisk, {{"Label", TCIMValue(object)}});
-    EXPECT_EQ(object, instance->GetProperty("Label", kNone)->GetValue(kNone).GetEmbeddedObject());
+    EXPECT_EQ(object, instance->GetProperty("Label", kNoContext)->GetValue(kNoContext).GetEmbeddedObject());
 }
 
 TEST_F(InMemInstanceTest, AnArrayIsABagUnlessDeclaredOtherwise)
@@ -123,11 +123,11 @@ TEST_F(InMemInstanceTest, AChangedKeyDoesNotChangeWhichInstanceItIs)
 {
     const auto instance = Add(fDisk, {{"Id", "sda"}});
     Property(instance, "Id").MarkChanged(TCIMValue("sdb"));
-    Property(instance, "Id").SetValue(TCIMValue("sdc"), kNone);
+    Property(instance, "Id").SetValue(TCIMValue("sdc"), kNoContext);
     EXPECT_EQ("Id=sdc Size=NULL Label=NULL Tags=NULL", ValuesOf(*instance));
-    EXPECT_EQ("root/cimv2:Disk.Id=\"sda\"", instance->GetReference(kNone).GetPath());
-    EXPECT_EQ(instance, fNamespace->GetInstance(Path("Disk.Id=\"sda\""), kNone));
-    EXPECT_EQ(TZELStatusCode::kNotFound, StatusOf([&] { fNamespace->GetInstance(Path("Disk.Id=\"sdc\""), kNone); }));
+    EXPECT_EQ("root/cimv2:Disk.Id=\"sda\"", instance->GetReference(kNoContext).GetPath());
+    EXPECT_EQ(instance, fNamespace->GetInstance(Path("Disk.Id=\"sda\""), kNoContext));
+    EXPECT_EQ(TZELStatusCode::kNotFound, StatusOf([&] { fNamespace->GetInstance(Path("Disk.Id=\"sdc\""), kNoContext); }));
     Add(fDisk, {{"Id", "sdc"}});
     EXPECT_EQ(TZELStatusCode::kAlreadyExists, StatusOf([&] { Add(fDisk, {{"Id", "sda"}}); }));
 }
@@ -135,9 +135,9 @@ TEST_F(InMemInstanceTest, AChangedKeyDoesNotChangeWhichInstanceItIs)
 TEST_F(InMemInstanceTest, DeletedAndAddedAgainItIsFoundByItsChangedKey)
 {
     const auto instance = Add(fDisk, {{"Id", "sda"}});
-    Property(instance, "Id").SetValue(TCIMValue("sdb"), kNone);
-    fNamespace->DeleteInstance(Path("Disk.Id=\"sda\""), kNone);
-    instance->AddToNamespace(kNone);
+    Property(instance, "Id").SetValue(TCIMValue("sdb"), kNoContext);
+    fNamespace->DeleteInstance(Path("Disk.Id=\"sda\""), kNoContext);
+    instance->AddToNamespace(kNoContext);
     EXPECT_EQ("Disk.Id=\"sdb\"\n", InstancesOf(*fDisk));
     EXPECT_EQ(instance, fNamespace->FindInstance(Path("Disk.Id=\"sdb\"")));
 }
@@ -145,7 +145,7 @@ TEST_F(InMemInstanceTest, DeletedAndAddedAgainItIsFoundByItsChangedKey)
 TEST_F(InMemInstanceTest, ReferencesNameNamespaceClassAndKeys)
 {
     const auto instance = Allocate(fDisk, {{"Id", "a\"b"}});
-    const TCIMReference path = instance->GetReference(kNone);
+    const TCIMReference path = instance->GetReference(kNoContext);
     EXPECT_EQ("root/cimv2:Disk.Id=\"a\\\"b\"", path.GetPath());
     EXPECT_EQ(fDisk, path.GetClass());
     EXPECT_EQ(fNamespace, path.GetNamespace());
@@ -155,12 +155,12 @@ TEST_F(InMemInstanceTest, AddingFailsForKeysThatAreTakenOrMissingAndTheSecondTim
 {
     const auto instance = Add(fDisk, {{"Id", "sda"}});
     EXPECT_EQ(TZELStatusCode::kAlreadyExists, StatusOf([&] { Add(fDisk, {{"Id", "sda"}}); }));
-    EXPECT_EQ(TZELStatusCode::kAlreadyExists, StatusOf([&] { Allocate(fDisk, {{"Id", "sda"}})->Validate(kNone); }));
-    EXPECT_EQ(TZELStatusCode::kSuccess, StatusOf([&] { Allocate(fDisk, {{"Id", "SDA"}})->Validate(kNone); }));
-    EXPECT_EQ(TZELStatusCode::kInvalidParameter, StatusOf([&] { instance->AddToNamespace(kNone); }));
+    EXPECT_EQ(TZELStatusCode::kAlreadyExists, StatusOf([&] { Allocate(fDisk, {{"Id", "sda"}})->Validate(kNoContext); }));
+    EXPECT_EQ(TZELStatusCode::kSuccess, StatusOf([&] { Allocate(fDisk, {{"Id", "SDA"}})->Validate(kNoContext); }));
+    EXPECT_EQ(TZELStatusCode::kInvalidParameter, StatusOf([&] { instance->AddToNamespace(kNoContext); }));
     const auto keyless = Allocate(fDisk, {{"Label", "x"}});
-    EXPECT_EQ(TZELStatusCode::kKeyMissing, StatusOf([&] { keyless->AddToNamespace(kNone); }));
-    EXPECT_EQ(TZELStatusCode::kKeyMissing, StatusOf([&] { keyless->Validate(kNone); }));
+    EXPECT_EQ(TZELStatusCode::kKeyMissing, StatusOf([&] { keyless->AddToNamespace(kNoContext); }));
+    EXPECT_EQ(TZELStatusCode::kKeyMissing, StatusOf([&] { keyless->Validate(kNoContext); }));
     EXPECT_EQ("Id", *keyless->FindMissingKey());
     EXPECT_EQ("Disk.Id=\"sda\"\n", InstancesOf(*fDisk));
 }
@@ -169,7 +169,7 @@ TEST_F(InMemInstanceTest, AClassWithoutKeysHasOneInstance)
 {
     const auto setting = Declare("Setting", nullptr, {{"Value", TType::kString, {}}});
     const auto instance = Add(setting, {{"Value", "on"}});
-    EXPECT_EQ(instance, fNamespace->GetInstance(Path("Setting"), kNone));
+    EXPECT_EQ(instance, fNamespace->GetInstance(Path("Setting"), kNoContext));
     EXPECT_EQ(TZELStatusCode::kAlreadyExists, StatusOf([&] { Add(setting, {{"Value", "off"}}); }));
 }
 
@@ -183,7 +183,7 @@ TEST_F(InMemInstanceTest, GeneratedKeysGetTheNextNumberOfTheirClass)
     Add(record, {{"Number", Uint64(7)}});
     const auto last = Add(record, {});
     EXPECT_EQ("Record.Number=1\nRecord.Number=2\nRecord.Number=7\nRecord.Number=8\nSpecial.Number=1\n", InstancesOf(*record, true));
-    fNamespace->DeleteInstance(last->GetReference(), kNone);
+    fNamespace->DeleteInstance(last->GetReference(), kNoContext);
     Add(record, {});
     EXPECT_EQ("Record.Number=1\nRecord.Number=2\nRecord.Number=7\nRecord.Number=9\n", InstancesOf(*record));
     EXPECT_EQ(TZELStatusCode::kAlreadyExists, StatusOf([&] { Add(record, {{"Number", Uint64(7)}}); }));
@@ -199,30 +199,31 @@ TEST_F(InMemInstanceTest, InstancesThatAreThereGetALaterPropertyAsNull)
 {
     const auto instance = Add(fDisk, {{"Id", "sda"}});
     fDisk->AddPropertyDecl(Decl({"Serial", TType::kString, {}}));
-    const auto serial = instance->GetProperty("Serial", kNone);
+    const auto serial = instance->GetProperty("Serial", kNoContext);
     fDisk->AddPropertyDecl(Decl({"Heat", TType::kUint8, {}}));
     fDisk->AddPropertyDecl(Decl({"Wear", TType::kUint8, {}}));
-    serial->SetValue(TCIMValue("S1"), kNone);
+    serial->SetValue(TCIMValue("S1"), kNoContext);
     instance->FindProperty("Wear")->MarkChanged(TCIMValue(static_cast<unsigned char>(3)));
     EXPECT_EQ("Id=sda Size=NULL Label=NULL Tags=NULL Serial=S1 Heat=NULL Wear=3", ValuesOf(*instance));
-    EXPECT_EQ("Serial", serial->GetPropertyDecl(kNone)->GetName(kNone));
+    EXPECT_EQ("Serial", serial->GetPropertyDecl(kNoContext)->GetName(kNoContext));
     EXPECT_TRUE(instance->FindProperty("Wear")->GetEarlierValue()->IsNull());
-    EXPECT_EQ("Id=NULL Size=NULL Label=NULL Tags=NULL Serial=NULL Heat=NULL Wear=NULL", ValuesOf(*fDisk->AllocateInstance(kNone)));
+    EXPECT_EQ("Id=NULL Size=NULL Label=NULL Tags=NULL Serial=NULL Heat=NULL Wear=NULL",
+              ValuesOf(*fDisk->AllocateInstance(kNoContext)));
 }
 
 TEST_F(InMemInstanceTest, HandlesKeepTheInstanceAliveAndOutliveTheNamespace)
 {
     auto instance = Add(fDisk, {{"Id", "sda"}, {"Label", "data on a rather long disk"}});
-    const auto label = instance->GetProperty("Label", kNone);
+    const auto label = instance->GetProperty("Label", kNoContext);
     fNamespace.reset();
     fDisk.reset();
-    EXPECT_EQ("root/cimv2:Disk.Id=\"sda\"", instance->GetReference(kNone).GetPath());
+    EXPECT_EQ("root/cimv2:Disk.Id=\"sda\"", instance->GetReference(kNoContext).GetPath());
     EXPECT_FALSE(instance->IsAdded());
-    EXPECT_EQ(TZELStatusCode::kNamespaceGone, StatusOf([&] { instance->AddToNamespace(kNone); }));
+    EXPECT_EQ(TZELStatusCode::kNamespaceGone, StatusOf([&] { instance->AddToNamespace(kNoContext); }));
     instance.reset();
-    EXPECT_EQ("data on a rather long disk", label->GetValue(kNone).ToText());
-    label->SetValue(TCIMValue("x"), kNone);
-    EXPECT_EQ("Label", label->GetPropertyDecl(kNone)->GetName(kNone));
+    EXPECT_EQ("data on a rather long disk", label->GetValue(kNoContext).ToText());
+    label->SetValue(TCIMValue("x"), kNoContext);
+    EXPECT_EQ("Label", label->GetPropertyDecl(kNoContext)->GetName(kNoContext));
 }
 
 TEST_F(InMemInstanceTest, ANamespaceWithReferencesIntoItselfIsDestroyed)
@@ -230,12 +231,12 @@ TEST_F(InMemInstanceTest, ANamespaceWithReferencesIntoItselfIsDestroyed)
     auto part = Allocate("Part", nullptr, {{"Name", TType::kString, {"Key"}}});
     part->AddPropertyDecl(Reference("Disk", "Disk"));
     part->AddPropertyDecl(Decl({"Default", TType::kReference, {"Static"}}));
-    part->AddToNamespace(kNone);
+    part->AddToNamespace(kNoContext);
     auto target = Add(fDisk, {{"Id", "sda"}});
     auto instance = Add(part, {{"Name", "p1"}, {"Disk", TCIMValue(target->GetReference())}});
-    part->SetPropertyValue("Default", TCIMValue(instance->GetReference()), kNone);
+    part->SetPropertyValue("Default", TCIMValue(instance->GetReference()), kNoContext);
     EXPECT_EQ("root/cimv2:Part.Disk=\"root/cimv2:Disk.Id=\\\"sda\\\"\",Name=\"p1\"",
-              part->GetProperty("Default", kNone)->GetValue(kNone).ToText());
+              part->GetProperty("Default", kNoContext)->GetValue(kNoContext).ToText());
     const boost::weak_ptr<TInMemNamespace> watchedNamespace = fNamespace;
     const boost::weak_ptr<TInMemClass> watchedClass = part;
     const boost::weak_ptr<TInMemInstance> watchedTarget = target;
@@ -253,16 +254,16 @@ TEST_F(InMemInstanceTest, AStaticPropertyIsMarkedForAllInstances)
     const auto cls = Declare("Model", nullptr, {{"Id", TType::kString, {"Key"}}, {"Firmware", TType::kString, {"Static"}}});
     const auto one = Add(cls, {{"Id", "1"}, {"Firmware", "old"}});
     const auto two = Add(cls, {{"Id", "2"}});
-    const auto ofTwo = two->GetProperty("Firmware", kNone);
+    const auto ofTwo = two->GetProperty("Firmware", kNoContext);
     const auto& stored = dynamic_cast<const TInMemStaticProperty&>(*ofTwo);
     EXPECT_FALSE(stored.IsChanged());
     EXPECT_EQ(nullptr, stored.GetEarlierValue());
     EXPECT_EQ(TZELStatusCode::kTypeMismatch, StatusOf([&] { ofTwo->MarkChanged(TCIMValue(5)); }));
     EXPECT_FALSE(stored.IsChanged());
-    one->GetProperty("Firmware", kNone)->MarkChanged(TCIMValue("new"));
-    one->GetProperty("Firmware", kNone)->MarkChanged(TCIMValue("newer"));
-    one->GetProperty("Firmware", kNone)->MarkRemoved();
-    EXPECT_EQ("newer", ofTwo->GetValue(kNone).ToText());
+    one->GetProperty("Firmware", kNoContext)->MarkChanged(TCIMValue("new"));
+    one->GetProperty("Firmware", kNoContext)->MarkChanged(TCIMValue("newer"));
+    one->GetProperty("Firmware", kNoContext)->MarkRemoved();
+    EXPECT_EQ("newer", ofTwo->GetValue(kNoContext).ToText());
     ASSERT_NE(nullptr, stored.GetEarlierValue());
     EXPECT_EQ("old", stored.GetEarlierValue()->ToText());
     EXPECT_TRUE(stored.IsRemoved());

@@ -35,7 +35,7 @@ class InMemMemoryTest : public TInMemFixture {
         cls->AddPropertyDecl(Decl({"Priority", TType::kUint16, {}}));
         cls->AddPropertyDecl(Decl({"Essential", TType::kBoolean, {}}));
         cls->AddPropertyDecl(Decl({"Architecture", TType::kString, {}}));
-        cls->AddToNamespace(kNone);
+        cls->AddToNamespace(kNoContext);
         return cls;
     }
 
@@ -81,13 +81,13 @@ TEST_F(InMemMemoryTest, ReadingAPropertyAllocatesNothing)
     cls->EnumerateInstances(
         [&](boost::shared_ptr<ICIMInstance> instance) {
             const std::size_t before = CountedAllocations();
-            const auto property = instance->GetProperty(name, kNone);
-            const TCIMValue value = property->GetValue(kNone);
+            const auto property = instance->GetProperty(name, kNoContext);
+            const TCIMValue value = property->GetValue(kNoContext);
             EXPECT_EQ(before, CountedAllocations());
             EXPECT_EQ("amd64", value.GetString());
             return true;
         },
-        false, kNone);
+        false, kNoContext);
 }
 
 TEST_F(InMemMemoryTest, AnInstanceIsOneAllocation)

@@ -17,14 +17,14 @@ TEST_F(InMemNamespaceTest, ProviderInmemIsThereFromTheStart)
 {
     const auto provider = TNamespaceProviderManager::GetInstance()->FindProvider("inmem");
     ASSERT_NE(nullptr, provider);
-    EXPECT_EQ("inmem", provider->GetName(kNone));
-    EXPECT_EQ(0, provider->GetType(kNone));
-    EXPECT_FALSE(provider->IsIndicationsSupported(kNone));
-    const auto first = provider->AllocateNamespace(kNone, false, "root/cimv2");
-    const auto second = provider->AllocateNamespace(kNone, true, "root/cimv2");
+    EXPECT_EQ("inmem", provider->GetName(kNoContext));
+    EXPECT_EQ(0, provider->GetType(kNoContext));
+    EXPECT_FALSE(provider->IsIndicationsSupported(kNoContext));
+    const auto first = provider->AllocateNamespace(kNoContext, false, "root/cimv2");
+    const auto second = provider->AllocateNamespace(kNoContext, true, "root/cimv2");
     EXPECT_NE(first, second);
-    EXPECT_EQ(provider, first->GetNamespaceProvider(kNone));
-    EXPECT_EQ(TZELStatusCode::kNotFound, StatusOf([&] { first->GetClass("Disk", kNone); }));
+    EXPECT_EQ(provider, first->GetNamespaceProvider(kNoContext));
+    EXPECT_EQ(TZELStatusCode::kNotFound, StatusOf([&] { first->GetClass("Disk", kNoContext); }));
     EXPECT_EQ("root/cimv2", boost::dynamic_pointer_cast<TInMemNamespace>(first)->GetNamespaceName());
 }
 
@@ -42,8 +42,9 @@ TEST_F(InMemNamespaceTest, InstancesComeInOrderOfInsertionAndOfExactlyTheClass)
     Add(fDisk, {{"Id", "sda"}});
     EXPECT_EQ("Disk.Id=\"sdb\"\nDisk.Id=\"sda\"\n", InstancesOf(*fDisk));
     EXPECT_EQ("Disk.Id=\"sdb\"\nDisk.Id=\"sda\"\nFastDisk.Id=\"sda\"\n", InstancesOf(*fDisk, true));
-    EXPECT_EQ("", InstancesOf(*fNamespace->GetClass("<root>", kNone)));
-    EXPECT_EQ("Disk.Id=\"sdb\"\nDisk.Id=\"sda\"\nFastDisk.Id=\"sda\"\n", InstancesOf(*fNamespace->GetClass("<root>", kNone), true));
+    EXPECT_EQ("", InstancesOf(*fNamespace->GetClass("<root>", kNoContext)));
+    EXPECT_EQ("Disk.Id=\"sdb\"\nDisk.Id=\"sda\"\nFastDisk.Id=\"sda\"\n",
+              InstancesOf(*fNamespace->GetClass("<root>", kNoContext), true));
 }
 
 TEST_F(InMemNamespaceTest, InstancesMayComeAndGoWhileTheyAreEnumerated)
@@ -55,10 +56,10 @@ TEST_F(InMemNamespaceTest, InstancesMayComeAndGoWhileTheyAreEnumerated)
     fDisk->EnumerateInstances(
         [&](boost::shared_ptr<ICIMInstance> instance) {
             Add(fDisk, {{"Id", TCIMValue("new" + std::to_string(seen))}});
-            fNamespace->DeleteInstance(instance->GetReference(kNone), kNone);
+            fNamespace->DeleteInstance(instance->GetReference(kNoContext), kNoContext);
             return ++seen > 0;
         },
-        false, kNone);
+        false, kNoContext);
     EXPECT_EQ(100, seen);
     EXPECT_EQ(100U, fDisk->GetInstanceCount());
 }
@@ -71,10 +72,10 @@ TEST_F(InMemNamespaceTest, AllInstancesMayBeDeletedWhileTheyAreEnumerated)
     int seen = 0;
     fDisk->EnumerateInstances(
         [&](boost::shared_ptr<ICIMInstance> instance) {
-            fNamespace->DeleteInstance(instance->GetReference(kNone), kNone);
+            fNamespace->DeleteInstance(instance->GetReference(kNoContext), kNoContext);
             return ++seen > 0;
         },
-        false, kNone);
+        false, kNoContext);
     EXPECT_EQ(100, seen);
     EXPECT_EQ("", InstancesOf(*fDisk));
 }
@@ -83,7 +84,7 @@ TEST_F(InMemNamespaceTest, PathsFindInstancesWhateverTheirNamespaceAndLetterCase
 {
     const auto instance = Add(fDisk, {{"Id", "sda"}});
     for (const char* path : {"Disk.Id=\"sda\"", "root/cimv2:DISK.ID=\"sda\"", "//host/other:disk.id=\"sda\""}) {
-        EXPECT_EQ(instance, fNamespace->GetInstance(Path(path), kNone)) << path;
+        EXPECT_EQ(instance, fNamespace->GetInstance(Path(path), kNoContext)) << path;
     }
     EXPECT_EQ(instance, fNamespace->FindInstance(instance->GetReference()));
 }
@@ -120,7 +121,7 @@ TEST_F(InMemNamespaceTest, KeysOfDatetimesAndReferencesAreReadToo)
     EXPECT_EQ(instance, fNamespace->FindInstance(Path("Event.Time=\"20200102020405.000000+000\"")));
     const auto link = Allocate("Link", nullptr);
     link->AddPropertyDecl(Reference("To", "Event"));
-    link->AddToNamespace(kNone);
+    link->AddToNamespace(kNoContext);
     const auto linked = Add(link, {{"To", TCIMValue(instance->GetReference())}});
     EXPECT_EQ(linked, fNamespace->FindInstance(Path(linked->GetReference().GetPath())));
 }
@@ -142,22 +143,22 @@ TEST_F(InMemNamespaceTest, PathsThatFindNothing)
                 {"Slot.Number=256", TZELStatusCode::kTypeMismatch},
                 {"Slot.Number=\"x\"", TZELStatusCode::kTypeMismatch}};
     for (const auto& row : rows) {
-        EXPECT_EQ(row.status, StatusOf([&] { fNamespace->GetInstance(Path(row.path), kNone); })) << row.path;
-        EXPECT_EQ(row.status, StatusOf([&] { fNamespace->DeleteInstance(Path(row.path), kNone); })) << row.path;
-        EXPECT_EQ(row.status, StatusOf([&] { fNamespace->ModifyInstance(Path(row.path), kNone, kNone); })) << row.path;
+        EXPECT_EQ(row.status, StatusOf([&] { fNamespace->GetInstance(Path(row.path), kNoContext); })) << row.path;
+        EXPECT_EQ(row.status, StatusOf([&] { fNamespace->DeleteInstance(Path(row.path), kNoContext); })) << row.path;
+        EXPECT_EQ(row.status, StatusOf([&] { fNamespace->ModifyInstance(Path(row.path), kNoContext, kNoContext); })) << row.path;
     }
-    EXPECT_EQ(TZELStatusCode::kNotFound, StatusOf([&] { fNamespace->GetInstance(TCIMReference(), kNone); }));
+    EXPECT_EQ(TZELStatusCode::kNotFound, StatusOf([&] { fNamespace->GetInstance(TCIMReference(), kNoContext); }));
 }
 
 TEST_F(InMemNamespaceTest, ADeletedInstanceLivesOnInItsHandlesAndMayComeBack)
 {
     const auto instance = Add(fDisk, {{"Id", "sda"}});
     Add(fDisk, {{"Id", "sdb"}});
-    fNamespace->DeleteInstance(instance->GetReference(), kNone);
+    fNamespace->DeleteInstance(instance->GetReference(), kNoContext);
     EXPECT_EQ("Disk.Id=\"sdb\"\n", InstancesOf(*fDisk));
-    EXPECT_EQ(TZELStatusCode::kNotFound, StatusOf([&] { fNamespace->DeleteInstance(instance->GetReference(), kNone); }));
+    EXPECT_EQ(TZELStatusCode::kNotFound, StatusOf([&] { fNamespace->DeleteInstance(instance->GetReference(), kNoContext); }));
     EXPECT_EQ("Id=sda Size=NULL Label=NULL Tags=NULL", ValuesOf(*instance));
-    instance->AddToNamespace(kNone);
+    instance->AddToNamespace(kNoContext);
     EXPECT_EQ("Disk.Id=\"sdb\"\nDisk.Id=\"sda\"\n", InstancesOf(*fDisk));
 }
 
@@ -165,7 +166,7 @@ TEST_F(InMemNamespaceTest, ModifyingSetsAllPropertiesOrNone)
 {
     const auto instance = Add(fDisk, {{"Id", "sda"}, {"Label", "one"}});
     const TCIMReference path = instance->GetReference();
-    fNamespace->ModifyInstance(path, {{"LABEL", TCIMValue("two")}, {"Size", Uint64(5)}, {"Id", TCIMValue("sda")}}, kNone);
+    fNamespace->ModifyInstance(path, {{"LABEL", TCIMValue("two")}, {"Size", Uint64(5)}, {"Id", TCIMValue("sda")}}, kNoContext);
     EXPECT_EQ("Id=sda Size=5 Label=two Tags=NULL", ValuesOf(*instance));
     const struct {
         TCallContext properties;
@@ -175,7 +176,7 @@ TEST_F(InMemNamespaceTest, ModifyingSetsAllPropertiesOrNone)
                 {{{"Id", TCIMValue("sdb")}, {"Label", TCIMValue("x")}}, TZELStatusCode::kInvalidParameter},
                 {{{"Id", TCIMValue()}, {"Label", TCIMValue("x")}}, TZELStatusCode::kInvalidParameter}};
     for (const auto& row : rows) {
-        EXPECT_EQ(row.status, StatusOf([&] { fNamespace->ModifyInstance(path, row.properties, kNone); }));
+        EXPECT_EQ(row.status, StatusOf([&] { fNamespace->ModifyInstance(path, row.properties, kNoContext); }));
         EXPECT_EQ("Id=sda Size=5 Label=two Tags=NULL", ValuesOf(*instance));
     }
 }
@@ -211,7 +212,7 @@ TEST_F(InMemNamespaceTest, ThousandsComeAndGoInConstantTime)
     for (int number = 0; number < 20000; ++number) {
         Add(fDisk, {{"Id", TCIMValue(std::to_string(number))}});
         if (number >= 10) {
-            fNamespace->DeleteInstance(Path("Disk.Id=\"" + std::to_string(number - 10) + "\""), kNone);
+            fNamespace->DeleteInstance(Path("Disk.Id=\"" + std::to_string(number - 10) + "\""), kNoContext);
         }
     }
     EXPECT_EQ(10U, fDisk->GetInstanceCount());
@@ -223,37 +224,37 @@ TEST_F(InMemNamespaceTest, QualifiersAreDeclaredOnce)
 {
     const auto declare = [&](const char* name) {
         return fNamespace->AllocateQualifierDecl(name, TCIMValue(false), ICIMQualifierDecl::kScopeProperty,
-                                                 ICIMQualifierDecl::kFlavorDefault, kNone);
+                                                 ICIMQualifierDecl::kFlavorDefault, kNoContext);
     };
     declare("Key");
     const auto units = declare("Units");
     EXPECT_EQ(TZELStatusCode::kAlreadyExists, StatusOf([&] { declare("KEY"); }));
     EXPECT_EQ(TZELStatusCode::kInvalidParameter, StatusOf([&] { declare(""); }));
-    EXPECT_EQ(units, fNamespace->GetQualifierDecl("units", kNone));
-    EXPECT_EQ(TCIMValue(false), units->GetValue(kNone));
-    EXPECT_EQ(ICIMQualifierDecl::kScopeProperty, units->GetScope(kNone));
-    EXPECT_EQ(ICIMQualifierDecl::kFlavorDefault, units->GetFlavor(kNone));
-    EXPECT_EQ(TZELStatusCode::kNotFound, StatusOf([&] { fNamespace->GetQualifierDecl("Max", kNone); }));
+    EXPECT_EQ(units, fNamespace->GetQualifierDecl("units", kNoContext));
+    EXPECT_EQ(TCIMValue(false), units->GetValue(kNoContext));
+    EXPECT_EQ(ICIMQualifierDecl::kScopeProperty, units->GetScope(kNoContext));
+    EXPECT_EQ(ICIMQualifierDecl::kFlavorDefault, units->GetFlavor(kNoContext));
+    EXPECT_EQ(TZELStatusCode::kNotFound, StatusOf([&] { fNamespace->GetQualifierDecl("Max", kNoContext); }));
     EXPECT_EQ("Key Units",
-              NamesOf<ICIMQualifierDecl>([&](const auto& callback) { fNamespace->EnumerateQualifierDecls(callback, kNone); }));
+              NamesOf<ICIMQualifierDecl>([&](const auto& callback) { fNamespace->EnumerateQualifierDecls(callback, kNoContext); }));
 }
 
 TEST_F(InMemNamespaceTest, WhatIsNotOfferedIsRefused)
 {
-    EXPECT_EQ(TZELStatusCode::kNotSupported, StatusOf([&] { fNamespace->SetUpcallNamespace(nullptr, kNone); }));
-    EXPECT_EQ(TZELStatusCode::kNotSupported, StatusOf([&] { fNamespace->AddUnderlyingNamespace(nullptr, kNone); }));
+    EXPECT_EQ(TZELStatusCode::kNotSupported, StatusOf([&] { fNamespace->SetUpcallNamespace(nullptr, kNoContext); }));
+    EXPECT_EQ(TZELStatusCode::kNotSupported, StatusOf([&] { fNamespace->AddUnderlyingNamespace(nullptr, kNoContext); }));
     EXPECT_EQ(TZELStatusCode::kNotOffered, StatusOf([&] {
                   fNamespace->Subscribe(
-                      nullptr, [](boost::shared_ptr<ICIMInstance>) { return true; }, kNone);
+                      nullptr, [](boost::shared_ptr<ICIMInstance>) { return true; }, kNoContext);
               }));
     int providers = 0;
-    fNamespace->EnumerateProviders([&](boost::shared_ptr<IProvider>) { return ++providers > 0; }, kNone);
+    fNamespace->EnumerateProviders([&](boost::shared_ptr<IProvider>) { return ++providers > 0; }, kNoContext);
     EXPECT_EQ(0, providers);
     const auto other = TInMemNamespace::Create("other");
     ICIMNamespace& target = *fNamespace;
     EXPECT_EQ(&target, &(target = *other));
     EXPECT_EQ("root/cimv2", fNamespace->GetNamespaceName());
-    EXPECT_EQ("Disk", NamesOf<ICIMClass>([&](const auto& callback) { fNamespace->EnumerateRootClasses(callback, kNone); }));
+    EXPECT_EQ("Disk", NamesOf<ICIMClass>([&](const auto& callback) { fNamespace->EnumerateRootClasses(callback, kNoContext); }));
 }
 
 }  // namespace

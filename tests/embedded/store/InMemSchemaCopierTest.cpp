@@ -11,7 +11,7 @@ class InMemSchemaCopierTest : public TInMemFixture {
     InMemSchemaCopierTest()
     {
         fNamespace->AllocateQualifierDecl("Vendor", TCIMValue::Null(TType::kString), ICIMQualifierDecl::kScopeClass,
-                                          ICIMQualifierDecl::kFlavorDefault, kNone);
+                                          ICIMQualifierDecl::kFlavorDefault, kNoContext);
         fDevice = Declare("Device", nullptr, {{"Id", TType::kString, {"Key"}}});
         fDevice->AddQualifier(Qualifier("Vendor", TCIMValue("any")));
         fDisk = Declare("Disk", fDevice, {{"Size", TType::kUint64, {"Big"}}});
@@ -46,7 +46,7 @@ TEST_F(InMemSchemaCopierTest, AClassComesWithItsSuperclasses)
 
 TEST_F(InMemSchemaCopierTest, WhatIsThereIsLeftAlone)
 {
-    fTarget->AllocateInMemClass("DEVICE", nullptr)->AddToNamespace(kNone);
+    fTarget->AllocateInMemClass("DEVICE", nullptr)->AddToNamespace(kNoContext);
     const auto declared = fCopier.CopyClass(*fDisk);
     ASSERT_EQ(1U, declared.size());
     EXPECT_EQ("DEVICE", declared[0]->GetSuperInMemClass()->GetName());
@@ -57,8 +57,8 @@ TEST_F(InMemSchemaCopierTest, WhatIsThereIsLeftAlone)
 TEST_F(InMemSchemaCopierTest, WhatIsJoinedKeepsToTheLimits)
 {
     const auto there = fTarget->AllocateInMemClass("Disk", fTarget->AllocateInMemClass("Thing", nullptr));
-    there->GetSuperInMemClass()->AddToNamespace(kNone);
-    there->AddToNamespace(kNone);
+    there->GetSuperInMemClass()->AddToNamespace(kNoContext);
+    there->AddToNamespace(kNoContext);
     for (std::size_t number = 0; number < TSchemaLimits::kMaxProperties; ++number) {
         there->AddPropertyDecl(Decl({"P" + std::to_string(number), TType::kUint8, {}}));
     }
@@ -68,8 +68,8 @@ TEST_F(InMemSchemaCopierTest, WhatIsJoinedKeepsToTheLimits)
     const auto wide = Declare("Wide", fDisk);
     wide->AddPropertyDecl(Decl({"More", TType::kUint8, {}}));
     const auto below = fNamespace->AllocateInMemClass("Below", wide);
-    below->AddToNamespace(kNone);
-    fTarget->AllocateInMemClass("Wide", there)->AddToNamespace(kNone);
+    below->AddToNamespace(kNoContext);
+    fTarget->AllocateInMemClass("Wide", there)->AddToNamespace(kNoContext);
     EXPECT_EQ(TZELStatusCode::kSuccess, StatusOf([&] { fCopier.CopyClass(*below); }));
     below->AddPropertyDecl(Decl({"Own", TType::kUint8, {}}));
     EXPECT_EQ(TZELStatusCode::kNotSupported,
@@ -81,7 +81,7 @@ TEST_F(InMemSchemaCopierTest, AConflictOfTypesDeclaresNoClass)
 {
     const auto other = fTarget->AllocateInMemClass("Device", nullptr);
     other->AddPropertyDecl(Decl({"Size", TType::kString, {}}));
-    other->AddToNamespace(kNone);
+    other->AddToNamespace(kNoContext);
     const auto fast = Declare("FastDisk", fDisk);
     EXPECT_EQ(TZELStatusCode::kTypeMismatch, StatusOf([&] { fCopier.CopyClass(*fast); }));
     EXPECT_EQ(1U, fTarget->GetClasses().size());
@@ -91,7 +91,7 @@ TEST_F(InMemSchemaCopierTest, APropertyComesWithItsQualifiersAndInstancesGetANul
 {
     const auto cls = fTarget->AllocateInMemClass("Disk", nullptr);
     cls->AddPropertyDecl(Decl({"Id", TType::kString, {"Key"}}));
-    cls->AddToNamespace(kNone);
+    cls->AddToNamespace(kNoContext);
     const auto instance = Add(cls, {{"Id", "sda"}});
     const auto copy = fCopier.CopyPropertyDecl(*fDisk->FindPropertyDecl("Size"), *cls);
     ASSERT_NE(nullptr, copy);
@@ -105,7 +105,7 @@ TEST_F(InMemSchemaCopierTest, NamesAreRespelledAndReferencesStayFound)
     fCopier.CopyClass(*fDisk);
     const auto room = fTarget->AllocateInMemClass("room", nullptr);
     room->AddPropertyDecl(Decl({"Name", TType::kString, {"Key"}}));
-    room->AddToNamespace(kNone);
+    room->AddToNamespace(kNoContext);
     const auto hall = Add(room, {{"Name", "hall"}});
     const auto sda = Add(fTarget->FindClass("Disk"), {{"Id", "sda"}, {"Room", TCIMValue(hall->GetReference())}});
     EXPECT_TRUE(fCopier.RespellClass("Room"));
@@ -136,10 +136,10 @@ TEST_F(InMemSchemaCopierTest, AnInheritedNameIsRespelledByOverridingIt)
 TEST_F(InMemSchemaCopierTest, AKeyOfSeveralReferencesStaysFoundToo)
 {
     const auto room = fTarget->AllocateInMemClass("room", nullptr);
-    room->AddToNamespace(kNone);
+    room->AddToNamespace(kNoContext);
     const auto door = fTarget->AllocateInMemClass("Door", nullptr);
     door->AddPropertyDecl(Decl({"Between", TType::kArrayReference, {"Key"}}));
-    door->AddToNamespace(kNone);
+    door->AddToNamespace(kNoContext);
     TCIMReference path;
     path.SetClass(room);
     const auto instance = Add(door, {{"Between", TCIMValue(TType::kArrayReference, 1, {TCIMValue(path)})}});
@@ -152,9 +152,9 @@ TEST_F(InMemSchemaCopierTest, AStaticPropertyKeepsItsValueWhenItIsRespelled)
     fDevice->AddPropertyDecl(Decl({"Version", TType::kString, {"Static"}}));
     fCopier.CopyClass(*fDisk);
     const auto copy = fTarget->FindClass("Disk");
-    copy->SetPropertyValue("Version", TCIMValue("1"), kNone);
+    copy->SetPropertyValue("Version", TCIMValue("1"), kNoContext);
     EXPECT_TRUE(fCopier.RespellProperty(*copy, "VERSION"));
-    EXPECT_EQ("1", copy->GetProperty("Version", kNone)->GetValue(kNone).ToText());
+    EXPECT_EQ("1", copy->GetProperty("Version", kNoContext)->GetValue(kNoContext).ToText());
 }
 
 }  // namespace

@@ -10,9 +10,9 @@ class InMemStagingTest : public TInMemFixture {
     std::string Contents()
     {
         std::string text =
-            NamesOf<ICIMQualifierDecl>([&](const auto& callback) { fNamespace->EnumerateQualifierDecls(callback, kNone); });
-        return text + "|" + SubClassesOf(*fNamespace->GetClass("<root>", kNone), true) + "|" +
-               InstancesOf(*fNamespace->GetClass("<root>", kNone), true);
+            NamesOf<ICIMQualifierDecl>([&](const auto& callback) { fNamespace->EnumerateQualifierDecls(callback, kNoContext); });
+        return text + "|" + SubClassesOf(*fNamespace->GetClass("<root>", kNoContext), true) + "|" +
+               InstancesOf(*fNamespace->GetClass("<root>", kNoContext), true);
     }
 
     void Fill(TInMemStaging& staging)
@@ -53,7 +53,7 @@ TEST_F(InMemStagingTest, OtherwiseTheNamespaceIsAsItWas)
         EXPECT_NE(before, Contents());
     }
     EXPECT_EQ(before, Contents());
-    EXPECT_EQ(TZELStatusCode::kNotFound, StatusOf([&] { fNamespace->GetClass("Tape", kNone); }));
+    EXPECT_EQ(TZELStatusCode::kNotFound, StatusOf([&] { fNamespace->GetClass("Tape", kNoContext); }));
     EXPECT_EQ(nullptr, fNamespace->FindInstance(Path("Disk.Id=\"sdb\"")));
     EXPECT_EQ(fFirst, fNamespace->FindInstance(Path("Disk.Id=\"sda\"")));
     Add(fRecord, {});
@@ -75,8 +75,8 @@ TEST_F(InMemStagingTest, WhatWasTakenBackMayBeStagedAgain)
 TEST_F(InMemStagingTest, StaticValuesAreAsTheyWereToo)
 {
     fDisk->AddPropertyDecl(Decl({"Firmware", TType::kString, {"Static"}}));
-    const auto firmware = fDisk->GetProperty("Firmware", kNone);
-    firmware->SetValue(TCIMValue("old"), kNone);
+    const auto firmware = fDisk->GetProperty("Firmware", kNoContext);
+    firmware->SetValue(TCIMValue("old"), kNoContext);
     {
         TInMemStaging staging(fNamespace);
         staging.KeepStaticValues(*fDisk);
@@ -84,7 +84,7 @@ TEST_F(InMemStagingTest, StaticValuesAreAsTheyWereToo)
         staging.KeepStaticValues(*fDisk);
         firmware->MarkChanged(TCIMValue("newest"));
     }
-    EXPECT_EQ("old", firmware->GetValue(kNone).ToText());
+    EXPECT_EQ("old", firmware->GetValue(kNoContext).ToText());
     EXPECT_FALSE(dynamic_cast<const TInMemStaticProperty&>(*firmware).IsChanged());
     {
         TInMemStaging staging(fNamespace);
@@ -92,7 +92,7 @@ TEST_F(InMemStagingTest, StaticValuesAreAsTheyWereToo)
         Allocate(fDisk, {{"Id", "sdb"}, {"Firmware", "new"}});
         staging.Commit();
     }
-    EXPECT_EQ("new", firmware->GetValue(kNone).ToText());
+    EXPECT_EQ("new", firmware->GetValue(kNoContext).ToText());
 }
 
 TEST_F(InMemStagingTest, RefusesWhatIsThereAndGoesOn)

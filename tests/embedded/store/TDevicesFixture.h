@@ -16,7 +16,7 @@ class TDevicesFixture : public TInMemFixture {
         fRoom = Declare("Room", nullptr, {{"Name", TType::kString, {"Key"}}});
     }
 
-    boost::shared_ptr<ICIMClass> Root() { return fNamespace->GetClass("<root>", kNone); }
+    boost::shared_ptr<ICIMClass> Root() { return fNamespace->GetClass("<root>", kNoContext); }
 
     TClassPointer fDevice, fDisk, fSolidState, fFan, fRoom;
 };

@@ -10,6 +10,7 @@
 
 #include "embedded/store/TInMemNamespace.h"
 #include "embedded/store/TInMemQualifier.h"
+#include "tests/support/NoContext.h"
 #include "tests/support/StatusOf.h"
 
 namespace NORVZEL20 {
@@ -64,7 +65,7 @@ class TInMemFixture : public testing::Test {
                           std::initializer_list<TProperty> properties = {})
     {
         auto cls = Allocate(name, superClass, properties);
-        cls->AddToNamespace(kNone);
+        cls->AddToNamespace(kNoContext);
         return cls;
     }
 
@@ -175,7 +176,6 @@ class TInMemFixture : public testing::Test {
         return values;
     }
 
-    const TCallContext kNone;
     boost::shared_ptr<TInMemNamespace> fNamespace = TInMemNamespace::Create("root/cimv2");
 };
 

@@ -14,14 +14,14 @@ namespace {
 TEST(StubClassTest, HasANameAndNothingElse)
 {
     const TStubClass stub("Disk");
-    EXPECT_EQ("Disk", stub.GetName(kNone));
-    EXPECT_EQ(nullptr, stub.GetNamespace(kNone));
-    EXPECT_EQ(nullptr, stub.GetSuperClass(kNone));
-    EXPECT_FALSE(stub.IsAssociation(kNone));
-    EXPECT_FALSE(stub.IsAbstract(kNone));
-    EXPECT_TRUE(stub.IsRootClass(kNone));
+    EXPECT_EQ("Disk", stub.GetName(kNoContext));
+    EXPECT_EQ(nullptr, stub.GetNamespace(kNoContext));
+    EXPECT_EQ(nullptr, stub.GetSuperClass(kNoContext));
+    EXPECT_FALSE(stub.IsAssociation(kNoContext));
+    EXPECT_FALSE(stub.IsAbstract(kNoContext));
+    EXPECT_TRUE(stub.IsRootClass(kNoContext));
     bool found = true;
-    EXPECT_EQ(nullptr, stub.GetQualifier("Key", found, kNone));
+    EXPECT_EQ(nullptr, stub.GetQualifier("Key", found, kNoContext));
     EXPECT_FALSE(found);
 }
 
@@ -30,15 +30,15 @@ TEST(StubClassTest, EnumerationsNeverCallBack)
     TStubClass stub("Disk");
     int calls = 0;
     const auto count = [&calls](const auto&) { return ++calls > 0; };
-    stub.EnumerateSubClasses(count, true, kNone);
-    stub.EnumerateAssociatedClasses(count, "", "", "", "", kNone);
-    stub.EnumerateAssociationClasses(count, "", "", kNone);
-    stub.EnumerateKeyNames(count, kNone);
-    stub.EnumeratePropertyDecls(count, kNone);
-    stub.EnumerateStaticProperties(count, kNone);
-    stub.EnumerateInstances(count, true, kNone);
-    stub.EnumerateMethodDecls(count, kNone);
-    stub.EnumerateQualifiers(count, kNone);
+    stub.EnumerateSubClasses(count, true, kNoContext);
+    stub.EnumerateAssociatedClasses(count, "", "", "", "", kNoContext);
+    stub.EnumerateAssociationClasses(count, "", "", kNoContext);
+    stub.EnumerateKeyNames(count, kNoContext);
+    stub.EnumeratePropertyDecls(count, kNoContext);
+    stub.EnumerateStaticProperties(count, kNoContext);
+    stub.EnumerateInstances(count, true, kNoContext);
+    stub.EnumerateMethodDecls(count, kNoContext);
+    stub.EnumerateQualifiers(count, kNoContext);
     EXPECT_EQ(0, calls);
 }
 
@@ -46,28 +46,29 @@ TEST(StubClassTest, LookingUpAnElementFindsNothing)
 {
     TStubClass stub("Disk");
     TCallContext parameters;
-    EXPECT_EQ(TZELStatusCode::kNotFound, StatusOf([&] { stub.GetPropertyDecl("Id", kNone); }));
-    EXPECT_EQ(TZELStatusCode::kNotFound, StatusOf([&] { stub.GetProperty("Id", kNone); }));
-    EXPECT_EQ(TZELStatusCode::kNotFound, StatusOf([&] { stub.SetPropertyValue("Id", TCIMValue(1), kNone); }));
-    EXPECT_EQ(TZELStatusCode::kNotFound, StatusOf([&] { stub.GetMethodDecl("Reset", kNone); }));
-    EXPECT_EQ(TZELStatusCode::kNotFound, StatusOf([&] { stub.InvokeMethod("Reset", parameters, kNone); }));
-    EXPECT_EQ(TZELStatusCode::kNotFound, StatusOf([&] { stub.GetQualifier("Key", kNone); }));
+    EXPECT_EQ(TZELStatusCode::kNotFound, StatusOf([&] { stub.GetPropertyDecl("Id", kNoContext); }));
+    EXPECT_EQ(TZELStatusCode::kNotFound, StatusOf([&] { stub.GetProperty("Id", kNoContext); }));
+    EXPECT_EQ(TZELStatusCode::kNotFound, StatusOf([&] { stub.SetPropertyValue("Id", TCIMValue(1), kNoContext); }));
+    EXPECT_EQ(TZELStatusCode::kNotFound, StatusOf([&] { stub.GetMethodDecl("Reset", kNoContext); }));
+    EXPECT_EQ(TZELStatusCode::kNotFound, StatusOf([&] { stub.InvokeMethod("Reset", parameters, kNoContext); }));
+    EXPECT_EQ(TZELStatusCode::kNotFound, StatusOf([&] { stub.GetQualifier("Key", kNoContext); }));
 }
 
 TEST(StubClassTest, ChangesAreRefused)
 {
     TStubClass stub("Disk");
-    EXPECT_EQ(TZELStatusCode::kNotSupported, StatusOf([&] { stub.Validate(kNone); }));
-    EXPECT_EQ(TZELStatusCode::kNotSupported, StatusOf([&] { stub.AddToNamespace(kNone); }));
-    EXPECT_EQ(TZELStatusCode::kNotSupported, StatusOf([&] { stub.RemoveFromNamespace(kNone); }));
-    EXPECT_EQ(TZELStatusCode::kNotSupported, StatusOf([&] { stub.ModifyClass(nullptr, kNone); }));
-    EXPECT_EQ(TZELStatusCode::kNotSupported, StatusOf([&] { stub.AllocateInstance(kNone); }));
-    EXPECT_EQ(TZELStatusCode::kNotSupported, StatusOf([&] { stub.AllocatePropertyDecl("Id", TCIMValue(1), kNone); }));
-    EXPECT_EQ(TZELStatusCode::kNotSupported, StatusOf([&] { stub.AllocateMethodDecl("M", TCIMValue::TCIMType::kUint8, kNone); }));
-    EXPECT_EQ(TZELStatusCode::kNotSupported, StatusOf([&] { stub.AllocateQualifier(nullptr, TCIMValue(1), kNone); }));
+    EXPECT_EQ(TZELStatusCode::kNotSupported, StatusOf([&] { stub.Validate(kNoContext); }));
+    EXPECT_EQ(TZELStatusCode::kNotSupported, StatusOf([&] { stub.AddToNamespace(kNoContext); }));
+    EXPECT_EQ(TZELStatusCode::kNotSupported, StatusOf([&] { stub.RemoveFromNamespace(kNoContext); }));
+    EXPECT_EQ(TZELStatusCode::kNotSupported, StatusOf([&] { stub.ModifyClass(nullptr, kNoContext); }));
+    EXPECT_EQ(TZELStatusCode::kNotSupported, StatusOf([&] { stub.AllocateInstance(kNoContext); }));
+    EXPECT_EQ(TZELStatusCode::kNotSupported, StatusOf([&] { stub.AllocatePropertyDecl("Id", TCIMValue(1), kNoContext); }));
     EXPECT_EQ(TZELStatusCode::kNotSupported,
-              StatusOf([&] { stub.AllocateQualifier(nullptr, TCIMValue(1), ICIMQualifierDecl::kFlavorNone, kNone); }));
-    EXPECT_EQ(TZELStatusCode::kNotSupported, StatusOf([&] { stub.AddQualifier(nullptr, kNone); }));
+              StatusOf([&] { stub.AllocateMethodDecl("M", TCIMValue::TCIMType::kUint8, kNoContext); }));
+    EXPECT_EQ(TZELStatusCode::kNotSupported, StatusOf([&] { stub.AllocateQualifier(nullptr, TCIMValue(1), kNoContext); }));
+    EXPECT_EQ(TZELStatusCode::kNotSupported,
+              StatusOf([&] { stub.AllocateQualifier(nullptr, TCIMValue(1), ICIMQualifierDecl::kFlavorNone, kNoContext); }));
+    EXPECT_EQ(TZELStatusCode::kNotSupported, StatusOf([&] { stub.AddQualifier(nullptr, kNoContext); }));
     EXPECT_EQ(TZELStatusCode::kNotSupported, StatusOf([&] { static_cast<ICIMClass&>(stub) = stub; }));
     EXPECT_EQ(TZELStatusCode::kNotSupported, StatusOf([&] { stub.AddChildClass(nullptr); }));
     EXPECT_EQ(TZELStatusCode::kNotSupported, StatusOf([&] { stub.RemoveChildClass(nullptr); }));
@@ -90,8 +91,8 @@ TEST(StubClassTest, NamesDecideEqualityAndOrder)
     EXPECT_FALSE(disk == drive);
     EXPECT_TRUE(disk < drive);
     EXPECT_FALSE(drive < disk);
-    EXPECT_TRUE(disk.IsSubclassOf(boost::make_shared<TStubClass>("disk"), kNone));
-    EXPECT_FALSE(disk.IsSubclassOf(boost::make_shared<TStubClass>("Drive"), kNone));
+    EXPECT_TRUE(disk.IsSubclassOf(boost::make_shared<TStubClass>("disk"), kNoContext));
+    EXPECT_FALSE(disk.IsSubclassOf(boost::make_shared<TStubClass>("Drive"), kNoContext));
     EXPECT_FALSE(disk.hasCollected());
 }
 
