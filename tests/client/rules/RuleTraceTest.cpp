@@ -129,9 +129,9 @@ std::map<std::string, unsigned int> FindListedLines(TRulesDocument document, con
             TCIMDiffEngine::TRuleset after = MakeRuleset(document, schema);
             listed.treatment = Other(listed.treatment);
             for (const char* name : kClasses) {
-                const auto& properties = before.getClassRules(name)->fProperties;
-                if (listed.property == property && properties.count(property) != 0 &&
-                    properties.at(property) != after.getClassRules(name)->fProperties.at(property)) {
+                const auto rules = before.getClassRules(name);
+                if (listed.property == property && rules->fProperties.count(property) != 0 &&
+                    rules->fProperties.at(property) != after.getClassRules(name)->fProperties.at(property)) {
                     lines[name] = listed.line;
                 }
             }
