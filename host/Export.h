@@ -6,5 +6,6 @@
 /// Marks a type or function of the installed headers.
 #define CIMDELTA_EXPORT [[gnu::visibility("default")]]
 
-/// Marks one that only cimdelta, the tests and the benchmarks use. Its header is not installed, and it may change at any time.
+/// Marks a type or function that only cimdelta, the tests and the benchmarks use. Its header is not installed, and it may change at
+/// any time.
 #define CIMDELTA_INTERNAL_EXPORT [[gnu::visibility("default")]]

@@ -108,7 +108,8 @@ class CIMDELTA_EXPORT ICIMClass : public ICIMElement, public ICIMNamedElement {
     /// Records that the instances have been collected. A host that does not collect ignores the call.
     virtual void SetCollected() {}
 
-    // The following change single elements. Adding returns false if the element is there already, removing if it is not there.
+    // The following operations change single elements. Adding returns false if the element is there already; removing returns
+    // false if it is not there.
 
     virtual bool AddChildClass(boost::shared_ptr<ICIMClass> cls) = 0;
     virtual bool RemoveChildClass(boost::shared_ptr<ICIMClass> cls) = 0;

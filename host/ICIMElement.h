@@ -11,7 +11,7 @@ class CIMDELTA_EXPORT ICIMElement {
   public:
     virtual ~ICIMElement() = default;
 
-    /// Returns if the element could be added to its namespace as it is.
+    /// Checks that the element could be added to its namespace as it is. Changes nothing.
     /// Errors: TZELException with the status that adding it would fail with.
     virtual void Validate(TCallContext context) const = 0;
 };

@@ -2,7 +2,8 @@
 
 namespace NORVZEL20 {
 
-/// The name of the pseudo-class above all top-level classes. ICIMNamespace::GetClass finds it; it is no class that can be declared.
+/// The name of the pseudo-class above all top-level classes. ICIMNamespace::GetClass finds it; no class of this name can be
+/// declared.
 inline constexpr char kRootClassName[] = "<root>";
 
 }  // namespace NORVZEL20

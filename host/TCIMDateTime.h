@@ -10,7 +10,7 @@ namespace NORVZEL20 {
 
 /// A CIM datetime: a point in time with its UTC offset, or an interval (DSP0004, 5.2.4 "Datetime type").
 ///
-/// A field, or a single digit of the microseconds, that is not known is written in asterisks. A value type of 16 bytes; nothing is
+/// Asterisks stand for a field, or for single digits of the microseconds, that is not known. A value type of 16 bytes; nothing is
 /// allocated.
 class CIMDELTA_EXPORT TCIMDateTime {
   public:
@@ -26,11 +26,11 @@ class CIMDELTA_EXPORT TCIMDateTime {
 
     bool IsInterval() const noexcept { return fInterval; }
 
-    /// Equal instants, whatever their offsets, or equal intervals, with asterisks in the same places. An interval never equals a
-    /// point in time.
+    /// True for equal instants, with any offsets, and for equal intervals, if both have asterisks in the same places. An interval
+    /// never equals a point in time.
     bool operator==(const TCIMDateTime& other) const noexcept;
     bool operator!=(const TCIMDateTime& other) const noexcept { return !(*this == other); }
-    /// Points in time by instant, intervals by length, and every point in time before every interval.
+    /// Orders points in time by instant and intervals by length. Every point in time comes before every interval.
     bool operator<(const TCIMDateTime& other) const noexcept;
 
     /// Microseconds since 1970-01-01 00:00 UTC, or of the interval; an unknown field counts as the least value it can have.

@@ -82,7 +82,7 @@ class CIMDELTA_EXPORT alignas(8) TCIMValue {
     TCIMValue() noexcept;
     /// A null of the given type.
     static TCIMValue Null(TCIMType type) noexcept;
-    /// A type is no value. Use Null for a null of that type.
+    /// A type is not a value. Use Null for a null of that type.
     TCIMValue(TCIMType::ECIMType type) = delete;
 
     TCIMValue(const TCIMValue& other) noexcept;
@@ -153,7 +153,7 @@ class CIMDELTA_EXPORT alignas(8) TCIMValue {
     const std::vector<TCIMValue>& GetElements() const;
 
     /// The same array as a bag (qualifier ArrayType "Bag"): as the left operand of a comparison it is equal to every array with the
-    /// same elements, whatever their order. A null, or a value that is no array, comes back unchanged. Texts do not show the mark.
+    /// same elements in any order. A null, or a value that is no array, comes back unchanged. Texts do not show the mark.
     TCIMValue AsBag() const;
     bool IsBag() const noexcept;
 
