@@ -5,8 +5,8 @@
 // A difference is stored as three kinds of instances in the delta namespace:
 //
 //     KALMO_DeltaClass               one for each class with differences
-//     KALMO_Delta                    one for each difference in the class: what kind, which instance, which property, which
-//     namespaces KALMO_DeltaClassAssocToDelta   one for each KALMO_Delta, with references to it and to its KALMO_DeltaClass
+//     KALMO_Delta                    one for each difference: its kind, the instance, the property, the namespaces
+//     KALMO_DeltaClassAssocToDelta   one for each KALMO_Delta, with references to it and to its KALMO_DeltaClass
 //
 // The engine sets no keys. The store generates them when an instance is added, so the association must be made last: before that,
 // the two references would have no keys. All instances are plain instances of the delta namespace's store.

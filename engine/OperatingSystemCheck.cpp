@@ -12,8 +12,8 @@ namespace {
 
 /// Appends the namespace's operating systems to `systems` and returns the type of the first element of `systems`.
 ///
-/// The first element always comes from the reference, whose type is thus compared with itself. Inventories of different operating
-/// systems pass the check; a namespace without the class fails it.
+/// The first element always comes from the reference, so the check compares the reference's type with itself. Inventories of
+/// different operating systems pass it; a namespace without the class fails it.
 unsigned short AppendOperatingSystems(ICIMNamespace& ns, std::vector<boost::shared_ptr<ICIMInstance>>& systems)
 {
     const boost::shared_ptr<ICIMClass> cls = ns.GetClass(kOperatingSystemClass, TCallContext());

@@ -15,7 +15,7 @@
 //     compare()       the subclasses of "<root>", in the reference's order
 //     compare(cls)    the class itself (TClassComparison), then its subclasses
 //
-// A class is thus finished, with its records written, before any class below it is looked at. Each class is compared with its own
+// A class is finished, with its records written, before any class below it is looked at. Each class is compared with its own
 // instances only: enumerations are never deep. Classes that only other namespaces have are not visited.
 //
 // No rules at all (one namespace, or the marker in the file name) means that every class excludes every property, and a class

@@ -39,8 +39,8 @@ class CIMDELTA_INTERNAL_EXPORT TCIMDiffEngine {
     /// The rules of all classes, by class name (byte for byte). Copies share the rules.
     ///
     /// Rules for a class also apply to its subclasses in the schema. Their order counts: rules for an ancestor that are read after
-    /// a subclass's own rules replace them. One thread writes a ruleset while it reads a specification; afterwards any thread may
-    /// read it.
+    /// a subclass's own rules prevail over them. One thread writes a ruleset while it reads a specification; afterwards any thread
+    /// may read it.
     class TRuleset {
       public:
         /// The rules of the class, or new rules that exclude everything if the ruleset has none. The new ones are not kept. Never

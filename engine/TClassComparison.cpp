@@ -32,6 +32,7 @@ std::vector<boost::shared_ptr<ICIMProperty>> GetProperties(const ICIMInstance& i
 void MarkPropertiesRemoved(const ICIMInstance& instance)
 {
     for (const boost::shared_ptr<ICIMProperty>& property : GetProperties(instance)) {
+        // A null is no value that the other namespace could lack.
         if (!property->GetValue(TCallContext()).IsNull()) {
             property->MarkRemoved();
         }
@@ -46,14 +47,15 @@ TCIMDiffEngine::TClassComparison::TClassComparison(TCIMDiffEngine& engine, boost
 {}
 
 // (1) Index the reference's instances of the class by key.
-// (2) Match the instances of each other namespace with them: keys that the other one lacks are absent, keys that the reference
-//     lacks are missing, properties of matched instances may differ.
-// (3) Without any of these, write nothing. Otherwise write the class's record, and then one for
-// (4) each absent instance,
-// (5) each missing instance, and
-// (6) each property that differs,
-//     all in the order of their keys.
-// With two namespaces, (2), (4) and (5) also bring the reference in line with the other one.
+// (2) Match the instances of each other namespace with them. A key that the other namespace lacks is absent, a key that the
+//     reference lacks is missing, and properties of matched instances may differ.
+// (3) If nothing is absent, missing or different, write nothing. Otherwise write the class's record.
+// (4) Write a record for each absent instance.
+// (5) Write a record for each missing instance.
+// (6) Write a record for each property that differs. The records of each of these steps are in the order of the keys.
+//
+// With exactly two namespaces, (2) also overwrites values of the reference, (4) marks the values of absent instances as removed,
+// and (5) copies missing instances into the reference.
 void TCIMDiffEngine::TClassComparison::Run()
 {
     if (fProperties.empty()) {
@@ -90,7 +92,7 @@ void TCIMDiffEngine::TClassComparison::CompareWithNamespace(std::size_t index)
     NoteAbsentInstances(index);
 }
 
-/// Whether the namespace has the class. It may lack the class only if the reference has no instances of it.
+/// Whether the namespace has the class. If it lacks the class although the reference has instances of it, the run fails.
 bool TCIMDiffEngine::TClassComparison::FindClassIn(std::size_t index)
 {
     try {
@@ -98,6 +100,7 @@ bool TCIMDiffEngine::TClassComparison::FindClassIn(std::size_t index)
         return true;
     } catch (const TZELException& error) {
         if (error.GetStatusCode() != TZELStatusCode::kNotFound) {
+            // Only the status is passed on, because the caller may not know the type of the host's exception.
             throw TZELException(error.GetStatusCode());
         }
     }
@@ -122,6 +125,7 @@ void TCIMDiffEngine::TClassComparison::NoteAbsentInstances(std::size_t index)
         if (master.found == 0) {
             fAbsent[key].push_back(static_cast<int>(index));
         }
+        // Ready for the next namespace.
         master.found = 0;
     }
 }
@@ -170,7 +174,7 @@ void TCIMDiffEngine::TClassComparison::RecordMissingInstances()
     for (const auto& [key, indices] : fMissing) {
         fEngine.createCIMDiff(fClassRecord, TDeltaNamespace::kInstanceAdded, key, "", indices);
         if (HasTwoNamespaces()) {
-            // Without an entry, the null pointer that this adds fails the host's assertion.
+            // If the other namespace has no such instance any more, this adds a null pointer, which fails the host's assertion.
             CopyToReference(others[key].instance);
         }
     }

@@ -18,7 +18,7 @@ class TCIMDiffEngine::TCompareInstances : public TUnaryFunction<boost::shared_pt
     TCompareInstances(const TCompareInstances& other) = default;
 
     /// If the reference has an instance of the same key, marks that one as found and compares the two. Otherwise enters the key as
-    /// missing from the reference. Always returns true, so that the enumeration goes on.
+    /// missing from the reference. Always returns true, so the enumeration continues.
     bool operator()(boost::shared_ptr<ICIMInstance> instance);
 
   private:

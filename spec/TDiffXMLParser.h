@@ -67,7 +67,7 @@ class TCIMDiffEngine::TDiffXMLParser : public TXmlParser {
     TRuleset fRuleset;
 
   protected:
-    // For parsers that derive from this one and note what is read. They only look at these.
+    // For parsers that derive from this one and note what is read. Such a parser reads these members but does not change them.
     boost::shared_ptr<TDiffClassRules> fCurrentRules;  ///< of the class that is read now or was read last; null before the first
     std::deque<boost::shared_ptr<TParseState>> fStateStack;  ///< the states, that of the document first
     std::string fCharData;                                   ///< the text collected since a "value" began or ended
