@@ -2,7 +2,7 @@
 
 #include <cstdint>
 
-/// The names and bounds that the plug-in shares with its clients: with whoever prepares a run, and with whoever reads its records.
+/// The names and bounds that the plug-in shares with its clients: with those that prepare a run and those that read its records.
 
 namespace NORVZEL20 {
 
@@ -30,12 +30,12 @@ inline constexpr char kDeltaAssociationDelta[] = "Delta";  ///< reference to the
 
 /// The class that each compared namespace must have. The reference also needs an instance of it.
 inline constexpr char kOperatingSystemClass[] = "KALMO_OperatingSystem";
-inline constexpr char kOperatingSystemType[] = "OSType";  ///< uint16: compared before a run begins
+inline constexpr char kOperatingSystemType[] = "OSType";  ///< uint16: a run needs that of the reference
 
-/// The property that a class is compared without, unless its rules include it by name.
+/// The property that is not compared in a class whose default is to include. If the default is to exclude, a list may include it.
 inline constexpr char kCollectionTime[] = "DateTimeOfCollection";
 
-/// A specification file with this text in its name is not read: the run goes without rules.
+/// A specification file with this text in its name is not read: the run has no rules.
 inline constexpr char kNoRulesMarker[] = "|fVMWareEnable";
 
 /// The size in bytes of the largest specification file that is read.

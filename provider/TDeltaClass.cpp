@@ -72,6 +72,7 @@ bool TDeltaClass::IsRootClass(TCallContext context) const
 boost::shared_ptr<ICIMClass> TDeltaClass::GetSuperClass(TCallContext context) const
 {
     const boost::shared_ptr<ICIMClass> superClass = fClass->GetSuperClass(context);
+    // A top-level class has no superclass; the null pointer then fails the host's assertion.
     return fDeltaNamespace->GetClass(superClass->GetName(context), context);
 }
 
@@ -84,6 +85,7 @@ void TDeltaClass::EnumerateSubClasses(const boost::function<bool(boost::shared_p
 bool TDeltaClass::IsSubclassOf(boost::shared_ptr<const ICIMClass> cls, TCallContext context) const
 {
     const boost::shared_ptr<const TDeltaClass> wrapper = boost::dynamic_pointer_cast<const TDeltaClass>(cls);
+    // The wrapped class must be compared with another wrapped class, so `cls` is unwrapped; null if it is no wrapper.
     return fClass->IsSubclassOf(wrapper->fClass, context);
 }
 
@@ -279,6 +281,7 @@ void TDeltaClass::ClearInstances() {}
 
 void TDeltaClass::AddObjectPathAlias(std::string alias, const TCIMReference& path)
 {
+    // emplace changes nothing if the alias exists: its first path stays.
     fObjectPathAliases.emplace(std::move(alias), path);
 }
 

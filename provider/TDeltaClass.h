@@ -22,7 +22,7 @@ class TDeltaNamespace;
 /// - An operation that would make a new element or change the class itself is refused with kNotSupported (31).
 /// - An operation that adds or removes an existing element (Add..., Remove...) changes the wrapped class.
 ///
-/// Made by TDeltaNamespace::GetClass and owned by shared pointers. Holds the delta namespace and the wrapped class as long as it
+/// TDeltaNamespace::GetClass makes it and shared pointers own it. It holds the delta namespace and the wrapped class as long as it
 /// lives. Threads: as the delta namespace.
 /// Errors: besides those named here, the errors of the wrapped class and of the delta namespace, unchanged. The order of the
 /// virtual operations is part of the contract.

@@ -70,6 +70,7 @@ unsigned short TDeltaNamespace::NumContainers() const
 void TDeltaNamespace::FindDifferences()
 {
     const std::string specFileName = fSpecFileName;
+    // The engine needs an owning pointer. If there is none, this throws before the run has any effect.
     const boost::shared_ptr<ICIMNamespace> self = shared_from_this();
     TCIMDiffEngine engine(self, fCompareList, specFileName);
     engine.compare();
@@ -117,6 +118,7 @@ boost::shared_ptr<ICIMClass> TDeltaNamespace::GetClass(const std::string& name, 
         return fDeltaStore->GetClass(name, context);
     } catch (const TZELException& error) {
         if (error.GetStatusCode() != TZELStatusCode::kNotFound) {
+            // Only the status is passed on, because the caller may not know the type of the host's exception.
             throw TZELException(error.GetStatusCode());
         }
     }
@@ -132,6 +134,7 @@ boost::shared_ptr<ICIMClass> TDeltaNamespace::GetWrappedClass(const std::string&
     }
     const boost::shared_ptr<ICIMClass> cls = fCompareList[index]->GetClass(name, context);
     const boost::shared_ptr<TDeltaClass> wrapper(new TDeltaClass(shared_from_this(), cls));
+    // Entered last: if anything above fails, the cache is as it was.
     fClassCache[index].emplace(name, wrapper);
     return wrapper;
 }

@@ -27,9 +27,9 @@ class TDeltaClass;
 /// - Any other class, and every qualifier declaration, comes from the compared namespace that the call context's entry "nsIndex"
 ///   selects. Its classes are wrapped as TDeltaClass, so a client that walks from class to class stays in the delta namespace.
 ///
-/// The schema cannot be changed: such requests are refused with kNotSupported (31).
+/// The namespace does not let its schema be changed: it refuses such requests with kNotSupported (31).
 ///
-/// Made by TDeltaNamespaceProvider::AllocateNamespace and owned by shared pointers. A wrapper keeps its delta namespace alive, and
+/// TDeltaNamespaceProvider::AllocateNamespace makes it and shared pointers own it. A wrapper keeps its delta namespace alive, and
 /// the namespace keeps its wrappers: after the first request for a wrapped class, both live until the process ends.
 /// Threads: use a delta namespace from one thread at a time.
 /// Errors: TZELException with the status that each operation names, and the exceptions of the host's objects, unchanged. A null
@@ -56,7 +56,7 @@ class CIMDELTA_EXPORT TDeltaNamespace : public ICIMNamespace, public boost::enab
     /// Releases the store, the compared namespaces and the wrappers. Nothing is written back.
     ~TDeltaNamespace() override;
 
-    /// Does nothing; the provider calls it once the namespace is owned by a shared pointer.
+    /// Does nothing. The provider calls it as soon as a shared pointer owns the namespace.
     void Initialize();
 
     /// Sets the specification file of later runs. If the name contains "|fVMWareEnable", they run without rules.

@@ -5,7 +5,7 @@
 #include "provider/TDeltaNamespace.h"
 
 // The plug-in needs no entry point: the initialisation of kLoaded, below, registers the provider while the library is loaded. The
-// provider and its name are initialised on first use, so they exist whichever static object of a host asks first.
+// provider and its name are initialised on first use, so a static object of a host may ask for them at any time.
 
 namespace NORVZEL20 {
 
