@@ -4,8 +4,8 @@
 // means itself is a set of one. Text and pattern are decoded first, so a step always stands for one character of UTF-8.
 //
 // Matching walks along the text and the steps at once. A % matches nothing at first. If a later step fails, the walk goes back to
-// the last % and lets it take one character more. Going back to an earlier % is never needed: whatever it could skip, the last one
-// can skip too. That bounds the work by the product of both lengths.
+// the last % and lets it take one character more. Going back to an earlier % is never needed: any text that it could skip, the last
+// one can skip too. That bounds the work by the product of both lengths.
 
 #include "embedded/query/TLikePattern.h"
 
@@ -17,7 +17,7 @@ namespace NORVZEL20 {
 
 namespace {
 
-/// A byte outside of UTF-8 gets a number beyond those of the characters, so that it equals nothing but the same byte.
+/// A byte outside of UTF-8 gets a number beyond those of the characters, so it equals only the same byte.
 std::vector<char32_t> Decode(std::string_view text)
 {
     constexpr char32_t kFirstByte = 0x110000;

@@ -77,6 +77,7 @@ bool TQueryComparison::AreComparable(TCIMValue::TCIMType a, TCIMValue::TCIMType 
     if (a.IsArray() || b.IsArray()) {
         return false;
     }
+    // The literal NULL and a property of another class have no type; they compare with everything, as unknown.
     if (a == TType::kNone || b == TType::kNone || a == b) {
         return true;
     }
@@ -116,6 +117,7 @@ TQueryComparison::EResult TQueryComparison::Compare(const TCIMValue& a, const TC
     if (a.GetType() == TType::kString && b.GetType() == TType::kString) {
         return Order(a.GetString(), b.GetString());
     }
+    // What is left is char16 and references, beside each other or beside a text literal.
     return Order(a.ToText(), b.ToText());
 }
 

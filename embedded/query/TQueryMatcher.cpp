@@ -4,8 +4,8 @@
 // part, and NOT swaps true and false and leaves unknown. An instance is part of the answer only if the whole condition is true. So
 // `Size = 5` and `NOT Size = 5` both leave out an instance whose Size is NULL.
 //
-// Whatever depends on the class alone is done once, when the matcher is made: finding the slots of the properties, and refusing
-// tests that the types of the properties do not allow.
+// Everything that depends on the class alone is done once, when the matcher is made: finding the slots of the properties, and
+// refusing tests that the types of the properties do not allow.
 
 #include "embedded/query/TQueryMatcher.h"
 
@@ -86,6 +86,7 @@ void TQueryMatcher::CheckComparison(const TQueryCondition& test) const
     if (isOrder && !TQueryComparison::AreOrdered(leftType, rightType)) {
         Refuse(Describe(left, leftType) + " and " + Describe(right, rightType) + " have no order", test.position);
     }
+    // A text that is compared with a datetime must be one. Found here, it is an error; found later, it would be unknown.
     for (const auto& [literal, type] : {std::make_pair(&left, rightType), std::make_pair(&right, leftType)}) {
         if (literal->name.empty() && !TQueryComparison::IsReadable(literal->literal, type)) {
             Refuse("'" + literal->literal.ToText() + "' is no datetime", literal->position);
@@ -114,6 +115,7 @@ const TCIMValue& TQueryMatcher::GetValue(const TQueryOperand& operand, const TIn
     if (operand.name.empty()) {
         return operand.literal;
     }
+    // Stands for a property that another class of the query declares.
     static const TCIMValue fgNull;
     const std::uint32_t slot = fSlots[operand.ordinal];
     return slot == TInMemLayout::kNoSlot ? fgNull : instance.GetSlotValue(slot);
@@ -145,6 +147,7 @@ TQueryMatcher::ETruth TQueryMatcher::EvaluateParts(const TQueryCondition& condit
     ETruth result = isOr ? kFalse : kTrue;
     for (const auto& part : condition.parts) {
         const ETruth truth = Evaluate(*part, instance);
+        // One part settles the result; the others are not evaluated.
         if (truth == decisive) {
             return decisive;
         }

@@ -19,6 +19,7 @@ namespace NORVZEL20 {
 
 namespace {
 
+/// Key words are not names: `SELECT FROM Disk` lacks its list and must not take FROM for a property.
 const char* const kKeywords[] = {"SELECT", "FROM", "WHERE", "AND", "OR", "NOT", "IS", "NULL", "LIKE", "ISA", "TRUE", "FALSE"};
 
 bool IsAnyKeyword(const std::string& name)
@@ -34,6 +35,7 @@ const std::pair<const char*, TQueryCondition::EKind> kComparisons[] = {
 
 }  // namespace
 
+/// From here on fToken is always the next token that no operation has read.
 TQueryParser::TQueryParser(const std::string& text, TQuery& query) : fQuery(query), fLexer(text)
 {
     Advance();
@@ -99,11 +101,13 @@ void TQueryParser::Parse()
     }
     fQuery.fClassPosition = fToken.position;
     fQuery.fClassName = TakeName("the name of a class");
+    // The class is known now, so names of it in front of listed properties can be checked.
     TakeList();
     if (TakeKeyword("WHERE")) {
         fQuery.fCondition = ReadOr();
     }
     if (fToken.kind != TQueryToken::kEnd) {
+        // The message names what could have followed here.
         FailExpected(fQuery.fCondition ? "AND, OR or the end of the query" : "WHERE or the end of the query");
     }
 }
@@ -123,6 +127,7 @@ TQueryParser::TListed TQueryParser::ReadListed()
     }
     listed.name = TakeName("* or the name of a property");
     if (TakeSymbol(".")) {
+        // The name was that of the class.
         listed.qualifier.swap(listed.name);
         listed.name = TakeSymbol("*") ? std::string() : TakeName("* or the name of a property");
     }
@@ -168,6 +173,7 @@ TQueryParser::TPointer TQueryParser::ReadAnd()
 TQueryParser::TPointer TQueryParser::ReadNot()
 {
     const std::size_t position = fToken.position;
+    // An error ends the parse, so only success takes the depth back.
     if (++fDepth > kMaxDepth) {
         Fail("conditions stand in each other more than " + std::to_string(kMaxDepth) + " deep", position);
     }
@@ -190,6 +196,7 @@ TQueryParser::TPointer TQueryParser::ReadNot()
 TQueryParser::TPointer TQueryParser::ReadTest()
 {
     TQueryOperand left = ReadOperand();
+    // ISA comes first, because it alone may have the name of the class on its left.
     if (IsKeyword("ISA")) {
         return ReadIsA(std::move(left));
     }
@@ -294,11 +301,13 @@ TQueryOperand TQueryParser::ReadProperty()
             Fail("'" + operand.name + "' is not the class of this query", operand.position);
         }
         operand.name = TakeName("the name of a property");
+        // In front of ISA the name of the class stands for the instance itself, not for a property.
     } else if (IsKeyword("ISA") && TNameText::Equal(operand.name, fQuery.fClassName)) {
         operand.name.clear();
         operand.isClass = true;
         return operand;
     }
+    // The matcher keeps the slots of properties by this number.
     operand.ordinal = fProperties++;
     return operand;
 }
@@ -306,6 +315,7 @@ TQueryOperand TQueryParser::ReadProperty()
 TCIMValue TQueryParser::ReadNumber() const
 {
     TCIMValue number;
+    // The first type that can hold the number exactly; real64 takes the rest.
     for (const auto type : {TCIMValue::TCIMType::kUint64, TCIMValue::TCIMType::kSint64, TCIMValue::TCIMType::kReal64}) {
         if (TValueText::Parse(type, fToken.text, number)) {
             return number;

@@ -85,6 +85,7 @@ TCIMReference::TContents& TCIMReference::Own()
     if (fContents == nullptr) {
         fContents = new TContents;
     } else if (!fContents->IsUnique()) {
+        // The swap gives up the use of the shared contents after the copy has succeeded.
         TCIMReference copy(new TContents(*fContents));
         std::swap(fContents, copy.fContents);
     }
@@ -93,6 +94,7 @@ TCIMReference::TContents& TCIMReference::Own()
 
 void TCIMReference::AddKeyValue(const std::string& name, const TCIMValue& value)
 {
+    // Checked first, so a value that is refused changes nothing.
     const unsigned int depth = TContents::GetDepth(value);
     if (depth > TContents::kMaxDepth) {
         throw TZELException(TZELStatusCode::kInvalidParameter);
@@ -186,7 +188,7 @@ void TCIMReference::SetNamespaceName(const std::string& name)
 {
     std::string trimmed(Trim(name, "/"));
     TContents::TPlace& place = Own().OwnPlace();
-    // The namespace at hand has the old name, so it cannot be the one that is meant now.
+    // The namespace held so far has the old name, so it is not the one that is meant now.
     if (!TNameText::Equal(place.namespaceName, trimmed)) {
         place.ns.reset();
     }
@@ -224,6 +226,7 @@ const TCIMValue* TCIMReference::FindKeyValue(const std::string& name) const
         return nullptr;
     }
     const auto& bindings = fContents->bindings;
+    // Paths have few keys, so they are searched from the front.
     const auto found = std::find_if(bindings.begin(), bindings.end(),
                                     [&name](const TContents::TBinding& binding) { return TNameText::Equal(binding.first, name); });
     return found != bindings.end() ? &found->second : nullptr;
@@ -234,6 +237,7 @@ unsigned int TCIMReference::TContents::GetDepth(const TCIMValue& value)
     switch (TValueAccess::GetForm(value)) {
     case TValueAccess::kPath: {
         const TContents* const contents = TValueAccess::GetPath(value).fContents;
+        // Each path keeps its own depth, so this does not descend into it.
         return contents != nullptr ? contents->depth + 1 : 1;
     }
     case TValueAccess::kArray:

@@ -133,6 +133,7 @@ class TPathReader {
         const bool isRead =
             Peek() == '\'' ? TValueText::Parse(TCIMValue::TCIMType::kChar16, ReadQuoted('\''), value) : ReadWord(value);
         if (!isRead) {
+            // The whole value is wrong, so the position is that of its first byte.
             fPosition = start;
             Fail();
         }
@@ -154,6 +155,7 @@ class TPathReader {
             if (fText[stop] == quote) {
                 return text;
             }
+            // The character behind a backslash is text, even if it is a quote.
             text += fText[fPosition++];
         }
     }
@@ -237,6 +239,7 @@ TCIMReference TCIMReference::Parse(const std::string& text, boost::shared_ptr<IC
     if (!path.fContents->cls) {
         path.SetClassName(className);
     }
+    // The bindings are sorted, have no duplicates and hold no references, so AddKeyValue has nothing to check or to find.
     path.fContents->bindings.reserve(reader.GetBindings().size());
     for (TPathReader::TBinding& binding : reader.GetBindings()) {
         path.fContents->bindings.emplace_back(std::move(binding.name), std::move(binding.value));

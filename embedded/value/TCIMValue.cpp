@@ -1,4 +1,4 @@
-// A value takes 16 bytes, so that an instance can hold its values in a row:
+// A value takes 16 bytes, so an instance can hold its values in a row:
 //
 //     byte         0     1     2                 3            8
 //     number       type  form  -                              64 bits
@@ -27,7 +27,8 @@ namespace NORVZEL20 {
 namespace {
 
 using TAccess = TValueAccess;
-/// The one failure of the accessors.
+
+/// Accessors fail in this way only.
 [[noreturn]] void RefuseType()
 {
     throw TZELException(TZELStatusCode::kTypeMismatch);
@@ -80,6 +81,7 @@ TCIMValue::TCIMValue(const TCIMValue& other) noexcept : fType(other.fType), fFor
     }
 }
 
+/// The use of the block moves along with the bytes, so the count stays as it is.
 TCIMValue::TCIMValue(TCIMValue&& other) noexcept : fType(other.fType), fForm(other.fForm)
 {
     std::memcpy(fBytes, other.fBytes, sizeof fBytes);
@@ -88,6 +90,7 @@ TCIMValue::TCIMValue(TCIMValue&& other) noexcept : fType(other.fType), fForm(oth
 
 TCIMValue& TCIMValue::operator=(const TCIMValue& other) noexcept
 {
+    // The copy is made first, so a value may be assigned to itself or to an element of itself.
     return *this = TCIMValue(other);
 }
 
@@ -166,6 +169,7 @@ TCIMValue::TCIMValue(TCIMType type, unsigned int count, const std::vector<TCIMVa
             RefuseType();
         }
     }
+    // The form is set last: if the allocation fails, this is still a null, which its destructor leaves alone.
     TAccess::Store(*this, static_cast<const TCounted*>(new TCountedArray(std::move(taken))));
     fForm = TAccess::kArray;
 }
@@ -287,6 +291,7 @@ TCIMValue TCIMValue::AsBag() const
 {
     TCIMValue result(*this);
     if (fForm == TAccess::kArray) {
+        // The block is shared; only the form differs.
         result.fForm = TAccess::kBag;
     }
     return result;

@@ -8,13 +8,13 @@ namespace NORVZEL20 {
 
 namespace {
 
-/// For everything that would change the class.
+/// Ends every operation that would change the class.
 [[noreturn]] void Refuse()
 {
     throw TZELException(TZELStatusCode::kNotSupported);
 }
 
-/// For every look-up.
+/// Ends every look-up of something that a stub does not have.
 [[noreturn]] void Miss()
 {
     throw TZELException(TZELStatusCode::kNotFound);

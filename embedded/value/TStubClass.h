@@ -7,9 +7,9 @@ namespace NORVZEL20 {
 
 /// The class of a path whose class nobody declared: a name and nothing else.
 ///
-/// It is in no namespace and has no superclass, properties, methods, instances or qualifiers. Looking one up throws kNotFound (15),
-/// enumerations do not call back, and every change throws kNotSupported (31). Like all classes, two stubs are equal if their names
-/// are.
+/// It is in no namespace and has no superclass, properties, methods, instances or qualifiers. Looking one up, setting a property
+/// and invoking a method throw kNotFound (15); only GetQualifier with `found` returns null instead. Enumerations do not call back.
+/// Validate and every other change throw kNotSupported (31). Two stubs are equal if their names are, without regard to letter case.
 class CIMDELTA_INTERNAL_EXPORT TStubClass : public ICIMClass {
   public:
     explicit TStubClass(std::string name);

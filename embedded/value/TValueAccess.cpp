@@ -12,6 +12,7 @@ static_assert(sizeof(TCIMReference) == sizeof(void*), "a path value holds the pa
 
 TCIMValue TValueAccess::FromSharedText(const TSharedText::TPointer& text) noexcept
 {
+    // Short text is copied into the value, which then needs no use of the block.
     if (text->GetText().size() <= kShortTextSize) {
         TCIMValue value(TCIMValue::TCIMType::kString, kShortText);
         StoreText(value, text->GetText());
@@ -55,12 +56,14 @@ void TValueAccess::StoreText(TCIMValue& value, std::string_view text) noexcept
 {
     value.fBytes[0] = static_cast<unsigned char>(text.size());
     if (!text.empty()) {
+        // The data of an empty view may be a null pointer, which memcpy does not accept.
         std::memcpy(value.fBytes + 1, text.data(), text.size());
     }
 }
 
 void TValueAccess::StoreDateTime(TCIMValue& value, const TCIMDateTime& time) noexcept
 {
+    // TCIMValue.cpp draws the layout; the numbers below are offsets in front of the microseconds.
     Store(value, time.fMicroseconds);
     Store(value, time.fOffset, 0);
     Store(value, time.fUnknown, 2);

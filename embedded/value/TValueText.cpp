@@ -53,6 +53,7 @@ bool ParseBoolean(std::string_view text, TCIMValue& result)
 
 bool ParseInteger(TType::ECIMType type, std::string_view text, TCIMValue& result)
 {
+    // The sign is taken off first: the digits are read as an unsigned number, for which the library accepts none.
     TInteger number{0, !text.empty() && text[0] == '-'};
     if (number.isNegative && !TTypeKind::IsSigned(type)) {
         return false;
@@ -117,6 +118,7 @@ bool ParseReal(TType::ECIMType type, std::string_view text, TCIMValue& result)
     double number = 0;
     float narrow = 0;
     if (!ReadNamedReal(text, number)) {
+        // A real32 is read as float at once. Rounding to double first and then to float could give another number.
         if (type == TType::kReal64 ? !ReadReal(text, number) : !ReadReal(text, narrow)) {
             return false;
         }
@@ -229,14 +231,14 @@ void TValueText::AppendQuoted(std::string& out, std::string_view text, char quot
     AppendQuotedBy(out, quote, [text](std::string& to) { to += text; });
 }
 
-// Counts the escapes and then moves the characters to their places, beginning at the end. That is linear, and text without escapes
-// is not touched.
+// Counts the escapes and then moves the characters to their places, beginning at the end. Cost: linear.
 void TValueText::EscapeFrom(std::string& out, std::size_t start, char quote)
 {
     std::size_t escapes = 0;
     for (std::size_t i = start; i < out.size(); ++i) {
         escapes += out[i] == quote || out[i] == '\\' ? 1 : 0;
     }
+    // Most text has none and is not touched.
     if (escapes == 0) {
         return;
     }

@@ -18,8 +18,7 @@ class CIMDELTA_INTERNAL_EXPORT TValueText {
     ///
     /// - boolean: TRUE or FALSE in any letter case
     /// - integer: decimal, or hexadecimal after 0x, within the type's range; a sign is optional, "-" only for signed types
-    /// - real: decimal with an optional exponent, within the type's range and rounded to the type; INF, -INF or NaN in any letter
-    /// case
+    /// - real: decimal with an optional exponent, within the type's range and rounded to the type; INF, -INF, NaN in any case
     /// - char16: one UCS-2 unit in UTF-8
     /// - datetime: 25 characters
     /// - string: the text as it is

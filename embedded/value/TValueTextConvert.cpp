@@ -28,6 +28,7 @@ bool ConvertToReal(const TCIMValue& value, TType::ECIMType type, TCIMValue& resu
         }
         number = integer.isNegative ? -number : number;
     }
+    // A real32 must hold exactly this number. NaN and the infinities have no digits to lose.
     if (type == TType::kReal32 && !std::isnan(number) && !std::isinf(number) &&
         (std::fabs(number) > static_cast<double>(std::numeric_limits<float>::max()) ||
          static_cast<double>(static_cast<float>(number)) != number)) {
@@ -62,6 +63,7 @@ bool ConvertArray(const TCIMValue& value, TType type, TCIMValue& result)
     return true;
 }
 
+/// Integers go between all number types; a real stays a real.
 bool ConvertNumber(const TCIMValue& value, TType::ECIMType type, TCIMValue& result)
 {
     const bool isInteger = TTypeKind::IsInteger(value.GetType());
@@ -76,6 +78,7 @@ bool ConvertNumber(const TCIMValue& value, TType::ECIMType type, TCIMValue& resu
 bool TValueText::Convert(const TCIMValue& value, TCIMValue::TCIMType type, TCIMValue& result)
 {
     if (value.IsNull()) {
+        // A null has a type too, so it gets the one asked for.
         result = TCIMValue::Null(type);
         return true;
     }

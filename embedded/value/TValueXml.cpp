@@ -33,6 +33,7 @@ void AppendRealWithPoint(std::string& out, const TCIMValue& value)
     const std::size_t start = out.size();
     TValueText::AppendPlain(out, value);
     if (std::isfinite(value.GetReal()) && out.find('.', start) == std::string::npos) {
+        // The point goes in front of an exponent: 1e+30 becomes 1.0e+30.
         const std::size_t exponent = out.find('e', start);
         out.insert(exponent == std::string::npos ? out.size() : exponent, ".0");
     }
@@ -91,6 +92,7 @@ void AppendNamespace(std::string& out, const TCIMReference& path)
     }
     out += "<LOCALNAMESPACEPATH>";
     std::string_view rest = path.GetNamespaceName();
+    // Each part of the name is an element of its own. Empty parts are left out.
     while (!rest.empty()) {
         const std::size_t end = std::min(rest.find('/'), rest.size());
         if (end > 0) {
@@ -111,7 +113,7 @@ void AppendClassName(std::string& out, const TCIMReference& path)
     out += "/>";
 }
 
-/// The attribute VALUETYPE, which is coarser than a type.
+/// The value of the attribute VALUETYPE, which distinguishes only these three kinds.
 const char* GetKeyKind(TType type)
 {
     switch (type) {
@@ -129,6 +131,7 @@ const char* GetKeyKind(TType type)
 void AppendKeyBinding(std::string& out, const std::pair<std::string, TCIMValue>& binding)
 {
     const auto& [name, value] = binding;
+    // CIM-XML has no key binding for a null or an array.
     if (value.IsNull() || value.GetType().IsArray()) {
         return;
     }
@@ -303,6 +306,7 @@ void TValueXml::AppendQualifier(std::string& out, const TEmbeddedObject::TQualif
     AppendAttribute(out, "NAME", qualifier.name);
     AppendAttribute(out, "TYPE", GetWrittenType(qualifier.value.GetType()));
     AppendFlag(out, "PROPAGATED", qualifier.propagated, false);
+    // The last argument is the default of DSP0201, which is not written.
     AppendFlag(out, "OVERRIDABLE", (qualifier.flavor & TDecl::kFlavorOverridable) != 0, true);
     AppendFlag(out, "TOSUBCLASS", (qualifier.flavor & TDecl::kFlavorToSubclass) != 0, true);
     AppendFlag(out, "TOINSTANCE", (qualifier.flavor & TDecl::kFlavorToInstance) != 0, false);
@@ -332,6 +336,7 @@ void TValueXml::AppendMethod(std::string& out, const TEmbeddedObject::TMethod& m
 {
     out += "<METHOD";
     AppendAttribute(out, "NAME", method.name);
+    // A method without a result has no TYPE.
     if (method.type != TType::kNone) {
         AppendAttribute(out, "TYPE", TValueText::GetTypeName(method.type));
     }

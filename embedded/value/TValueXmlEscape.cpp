@@ -68,6 +68,7 @@ void AppendText(std::string& out, std::string_view text, bool isAttribute)
         if (i == text.size()) {
             return;
         }
+        // ASCII goes to AppendSpecial, which also replaces control characters.
         const std::size_t length = static_cast<unsigned char>(text[i]) >= 0x80 ? GetXmlLength(text.substr(i)) : 0;
         if (length > 0) {
             out += text.substr(i, length);
