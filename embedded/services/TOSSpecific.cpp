@@ -1,8 +1,7 @@
 // Where the host finds its data.
 //
 //  1. CIMDELTA_ROOT, if it is set and not empty.
-//  2. The place for data of the package that the library is installed in, relative to the library. A package can therefore be
-//  moved.
+//  2. The place for data of the package that the library is installed in. It is relative to the library, so a package can be moved.
 //  3. In a build tree there is no such place. There the folder "root", beside that of the libraries, has a link to the data of the
 //     sources. It is used only if it has data and the place of the package has none.
 

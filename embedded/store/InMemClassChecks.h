@@ -8,16 +8,17 @@ class TInMemPropertyDecl;
 
 // What must hold before a class is changed.
 
-/// Returns if `decl` may be added to `cls`. Errors: kTypeMismatch (13) if an ancestor or a class below declares a property of that
+/// Checks that `decl` may be added to `cls`. Errors: kTypeMismatch (13) if an ancestor or a class below declares a property of that
 /// name with another type. Cost: one look-up for each class below.
 void CheckTypeFits(const TInMemClass& cls, const TInMemPropertyDecl& decl);
 
-/// Returns if `decl`, which `cls` declares, may cease to be a key or go. Errors: kClassInUse (19) if `cls` or a class below has
-/// instances and would lose the key: instances are told apart by their keys. Cost: one look-up for each class below.
+/// Checks that `decl`, which `cls` declares, may cease to be a key or be removed. Errors: kClassInUse (19) if `cls` or a class
+/// below has instances and would lose the key, because instances might then have equal keys. Cost: one look-up for each class
+/// below.
 void CheckKeyStays(const TInMemClass& cls, const TInMemPropertyDecl& decl);
 
-/// Returns if the properties and methods that both classes have are of the same types. `source` may be a class of any host. Errors:
-/// kTypeMismatch (13).
+/// Checks that the properties and methods that both classes have are of the same types. `source` may be a class of any host.
+/// Errors: kTypeMismatch (13).
 void CheckTypesAgree(const ICIMClass& source, const TInMemClass& target);
 
 }  // namespace NORVZEL20

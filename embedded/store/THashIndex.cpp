@@ -2,7 +2,7 @@
 //
 // An entry has a home, computed from its hash. If another entry is there, it goes to the next free place behind. A search starts at
 // the home and ends at the first free place, so there must be no free place between an entry and its home. Removing an entry would
-// leave one: the entries that follow are therefore moved up where they may. The table doubles when over four fifths are in use.
+// leave one. So the entries that follow are moved up if their homes allow it. The table doubles when over four fifths are in use.
 
 #include "embedded/store/THashIndex.h"
 

@@ -58,6 +58,7 @@ boost::shared_ptr<TInMemNamespace> TInMemClass::RequireNamespace() const
 
 TInMemExtent& TInMemClass::GetExtent() const
 {
+    // Without an extent, either the namespace is gone or the class is not declared in it.
     if (!fExtent) {
         RequireNamespace();
         throw TZELException(TZELStatusCode::kNotFound);
@@ -67,6 +68,7 @@ TInMemExtent& TInMemClass::GetExtent() const
 
 void TInMemClass::Enter(TInMemClass& parent, TInMemExtent& extent)
 {
+    // The superclass may have changed between the allocation of this class and its declaration.
     fLayout.CatchUp();
     fMethods.InheritAll();
     parent.fSubClasses.push_back(weak_from_this());  // the last step that may fail
@@ -92,7 +94,7 @@ void TInMemClass::AddToNamespace(TCallContext)
 void TInMemClass::RemoveFromNamespace(TCallContext)
 {
     const auto ns = RequireNamespace();
-    GetExtent();
+    GetExtent();  // refuses a class that is not declared
     if (!GetSubClasses().empty() || GetInstanceCount() > 0) {
         throw TZELException(TZELStatusCode::kClassInUse);
     }
@@ -113,6 +115,7 @@ void TInMemClass::ModifyClass(boost::shared_ptr<ICIMClass> cls, TCallContext con
             return true;
         },
         context);
+    // From here on, only a lack of memory or a failure of `cls` can leave the change half done.
     for (const auto& decl : missing) {
         AddPropertyDecl(decl);
     }
@@ -151,7 +154,7 @@ bool TInMemClass::IsAssociation(TCallContext) const
 
 bool TInMemClass::IsAbstract(TCallContext) const
 {
-    return GetQualifiers().IsOwnTrue("Abstract");  // never inherited, whatever flavor it was written with
+    return GetQualifiers().IsOwnTrue("Abstract");  // never inherited, even if its flavor says so
 }
 
 bool TInMemClass::IsRootClass(TCallContext) const
@@ -216,6 +219,7 @@ bool TInMemClass::IsSubclassOf(std::string_view name) const noexcept
             return true;
         }
     }
+    // Every class is below the pseudo-class.
     return name == kRootClassName;
 }
 
@@ -243,6 +247,7 @@ void TInMemClass::EnumerateInstances(const boost::function<bool(boost::shared_pt
                                      TCallContext)
 {
     const auto ns = RequireNamespace();  // kept alive while the callback runs
+    // The pseudo-class has no instances of its own, and no extent.
     if (fName != kRootClassName && !GetExtent().Enumerate(callback)) {
         return;
     }
@@ -250,6 +255,7 @@ void TInMemClass::EnumerateInstances(const boost::function<bool(boost::shared_pt
         return;
     }
     for (const auto& cls : GetClassesBelow()) {
+        // The callback may have removed this class meanwhile.
         if (cls->fExtent && !cls->fExtent->Enumerate(callback)) {
             return;
         }
@@ -318,6 +324,7 @@ bool TInMemClass::AddInstance(boost::shared_ptr<ICIMInstance> instance)
     try {
         GetExtent().Add(own);
     } catch (const TZELException& failure) {
+        // The contract of this operation: taken keys give false, any other failure is thrown.
         if (failure.GetStatusCode() != TZELStatusCode::kAlreadyExists) {
             throw;
         }

@@ -21,8 +21,8 @@ class TInMemNamespace;
 
 /// A class of an in-memory namespace.
 ///
-/// Keeps the layout of its instances (TInMemLayout), its methods (TInMemMethodSet) and its qualifiers. Holds its superclass; is
-/// held by its namespace, its subclasses, its instances and the references to it. After the namespace is gone, operations that
+/// It keeps the layout of its instances (TInMemLayout), its methods (TInMemMethodSet) and its qualifiers. It holds its superclass.
+/// Its namespace, its subclasses, its instances and the references to it hold it. After the namespace is gone, operations that
 /// need it throw kNamespaceGone (18); the others work as before.
 /// A change of properties reaches all classes below. It finds the memory for that first; if that fails, nothing has changed.
 /// Comparison operators compare names without regard to letter case; assignment takes nothing over.
@@ -35,7 +35,7 @@ class CIMDELTA_EXPORT TInMemClass final : public TInMemNamedElement<ICIMClass>, 
                                                  boost::shared_ptr<TInMemClass> superClass);
     TInMemClass(const TInMemClass&) = delete;
 
-    /// Returns if AddToNamespace would succeed. Errors: those of AddToNamespace.
+    /// Checks that AddToNamespace would succeed. Errors: those of AddToNamespace.
     void Validate(TCallContext context) const override;
     /// Errors: kAlreadyExists (12) if the name is taken, kTypeMismatch (13) if the superclass has got one of its properties with
     /// another type, kNotFound (15) if the superclass is not declared, kNamespaceGone (18).

@@ -76,6 +76,7 @@ boost::shared_ptr<ICIMPropertyDecl> TInMemClass::GetPropertyDecl(const std::stri
     return decl;
 }
 
+/// The order is copied here and below, because the callback may add or remove properties.
 void TInMemClass::EnumeratePropertyDecls(const boost::function<bool(boost::shared_ptr<ICIMPropertyDecl>)>& callback,
                                          TCallContext) const
 {
@@ -109,8 +110,10 @@ bool TInMemClass::AddPropertyDecl(boost::shared_ptr<ICIMPropertyDecl> decl)
     }
     CheckTypeFits(*this, *own);
     const auto below = GetReservedClassesBelow();
+    // In a subclass the inherited properties come first, so the new one is inserted behind those that this class had.
     const std::size_t position = fLayout.GetOrder().size();
     fLayout.AddOwn(own);
+    // AddOwn was the last step that may fail.
     own->SetOwner(weak_from_this());
     for (const auto& cls : below) {
         cls->fLayout.TakeIn(own, position);
@@ -126,6 +129,7 @@ bool TInMemClass::RemovePropertyDecl(boost::shared_ptr<ICIMPropertyDecl> decl)
     }
     CheckKeyStays(*this, *own);
     const auto below = GetClassesBelow();
+    // Nothing moves: the slot stays and is unused from now on (see TInMemLayout.cpp).
     own->SetOwner({});
     fLayout.RemoveOwn(own);
     for (const auto& cls : below) {
@@ -134,6 +138,7 @@ bool TInMemClass::RemovePropertyDecl(boost::shared_ptr<ICIMPropertyDecl> decl)
     return true;
 }
 
+/// The handle keeps the declaration alive, in which the value lives.
 boost::shared_ptr<ICIMProperty> TInMemClass::GetProperty(const std::string& name, TCallContext)
 {
     const auto decl = FindPropertyDecl(name);
@@ -183,6 +188,7 @@ void TInMemClass::EnumerateMethodDecls(const boost::function<bool(boost::shared_
     }
 }
 
+/// An own method of a class below may now override another declaration, or none.
 void TInMemClass::MethodChanged(std::string_view name)
 {
     for (const auto& cls : GetClassesBelow()) {
@@ -245,6 +251,7 @@ bool TInMemClass::AddAssociationClass(boost::shared_ptr<ICIMClass> cls)
     if (IsAssociatedBy(*association)) {
         return false;
     }
+    // Held weakly, because two classes may name each other.
     fAssociations.push_back(association);
     return true;
 }

@@ -163,6 +163,7 @@ boost::shared_ptr<TInMemInstance> TInMemExtent::Find(const std::vector<TCIMValue
 bool TInMemExtent::Remove(const TInMemInstance& instance)
 {
     const auto isIt = [&](std::uint32_t ordinal) { return fInstances[ordinal].get() == &instance; };
+    // The hash is the one that the instance was indexed with, so this also works while the index is stale.
     const std::uint32_t ordinal = fIndex.Find(instance.GetKeyHash(), isIt);
     if (ordinal == THashIndex::kNone) {
         return false;
@@ -234,6 +235,7 @@ TInMemExtent::TMark TInMemExtent::GetMark() const noexcept
 
 void TInMemExtent::RollBack(const TMark& mark) noexcept
 {
+    // From the end, so the positions of the instances that stay do not change.
     while (fInstances.size() > mark.size) {
         TInMemInstance& instance = *fInstances.back();
         fIndex.Remove(instance.GetKeyHash(), static_cast<std::uint32_t>(fInstances.size() - 1));

@@ -32,7 +32,7 @@ class TInMemExtent {
     /// Adds `instance`, which must be of this class. Errors: kAlreadyExists (12) if an instance with the same keys is there,
     /// kKeyMissing (14), kInvalidParameter (5) if it is in an extent already; nothing is added then.
     void Add(const boost::shared_ptr<TInMemInstance>& instance);
-    /// Returns if Add would succeed. Errors: those of Add.
+    /// Checks that Add would succeed. Errors: those of Add.
     void Check(const TInMemInstance& instance) const;
     /// The instance with these keys (in the order of the class's keys, in their declared types), or null.
     boost::shared_ptr<TInMemInstance> Find(const std::vector<TCIMValue>& keys) const;

@@ -72,6 +72,7 @@ TInMemBlock& TInMemInstance::GetOwnBlock() const noexcept
 
 boost::shared_ptr<TInMemInstance> TInMemInstance::Create(boost::shared_ptr<TInMemClass> cls)
 {
+    // One allocation for everything. The allocator puts the counts of the shared pointer in front of the instance.
     using TAllocator = TPlacedAllocator<TInMemInstance>;
     const std::uint32_t slots = cls->GetLayout().GetSlotCount();
     char* const block =
@@ -106,6 +107,7 @@ TCIMReference TInMemInstance::GetReference() const
 {
     const auto ns = fClass->GetInMemNamespace();
     TCIMReference path(ns, std::map<std::string, TCIMValue>());
+    // The name still says where the instance was.
     if (!ns) {
         path.SetNamespaceName(fClass->GetNamespaceName());
     }
@@ -127,6 +129,7 @@ boost::shared_ptr<ICIMClass> TInMemInstance::GetClass(TCallContext) const
     return fClass;
 }
 
+/// A static property lives in its declaration, any other one in the instance; the handle keeps that object alive.
 boost::shared_ptr<ICIMProperty> TInMemInstance::GetHandle(std::uint32_t slot,
                                                           const boost::shared_ptr<const TInMemInstance>& self) const
 {
@@ -150,6 +153,7 @@ void TInMemInstance::EnumerateProperties(const boost::function<bool(boost::share
 {
     const auto self = shared_from_this();
     const std::vector<std::uint32_t>& order = fClass->GetLayout().GetOrder();
+    // By position, because the callback may add properties to the class.
     for (std::size_t at = 0; at < order.size(); ++at) {
         if (!callback(GetHandle(order[at], self))) {
             return;
@@ -216,6 +220,7 @@ TInMemProperty& TInMemInstance::GetLateProperty(std::uint32_t slot) const
             return late.block->GetProperty(slot - late.first);
         }
     }
+    // Room first: once the block is made, nothing may fail.
     lateBlocks.reserve(lateBlocks.size() + 1);
     const TInMemLayout& layout = fClass->GetLayout();
     const std::uint32_t count = layout.GetSlotCount() - end;
@@ -259,6 +264,7 @@ void TInMemInstance::SetRemoved() noexcept
 {
     fAdded = 0;
     if (fExtras) {
+        // Outside of an extent the present keys count.
         fExtras->keys.clear();
     }
 }

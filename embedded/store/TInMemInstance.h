@@ -17,7 +17,7 @@ class TInMemClass;
 
 /// An instance in memory: one block with the shared pointer's counts, the instance and all its properties.
 ///
-/// Made by TInMemClass::AllocateInMemInstance. A property that the class gets later is made when it is first asked for. Handles
+/// TInMemClass::AllocateInMemInstance makes it. A property that the class gets later is made when it is first asked for. Handles
 /// stay valid when the instance is deleted and when the namespace goes; AddToNamespace then throws kNamespaceGone (18).
 /// Threads: as the namespace, reading included.
 class CIMDELTA_EXPORT TInMemInstance final : public ICIMInstance, public boost::enable_shared_from_this<TInMemInstance> {
@@ -28,7 +28,7 @@ class CIMDELTA_EXPORT TInMemInstance final : public ICIMInstance, public boost::
     TInMemInstance& operator=(const TInMemInstance&) = delete;
     ~TInMemInstance() override;
 
-    /// Returns if AddToNamespace would succeed. Errors: those of AddToNamespace.
+    /// Checks that AddToNamespace would succeed. Errors: those of AddToNamespace.
     void Validate(TCallContext context) const override;
     /// Generated keys that are null get the next number of the class first. Errors: also kInvalidParameter (5) if it is in a
     /// namespace.

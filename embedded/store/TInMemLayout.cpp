@@ -53,7 +53,7 @@ void TInMemLayout::CatchUp()
 
 void TInMemLayout::Reserve()
 {
-    // Twice what is needed, so that a class that grows property by property is not copied each time.
+    // Twice what is needed: otherwise a class that grows property by property would be copied each time.
     const auto reserve = [](auto& list, std::size_t count) {
         if (count > list.capacity()) {
             list.reserve(2 * count);

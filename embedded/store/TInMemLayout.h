@@ -15,7 +15,7 @@ namespace NORVZEL20 {
 ///
 /// A slot stays the same as long as the layout lives. Slots are not in order of declaration: use GetOrder for that.
 /// Changes come in two steps. Reserve, on this layout and on those that inherit from it, is the only one that may fail; Update and
-/// TakeIn cannot fail after it. Whoever changes a layout calls them for each layout below it, superclasses first.
+/// TakeIn cannot fail after it. The caller that changes a layout calls them for each layout below it, superclasses first.
 /// Threads: as the namespace of the class.
 class CIMDELTA_EXPORT TInMemLayout {
   public:

@@ -29,6 +29,7 @@ boost::shared_ptr<TInMemNamespace> TInMemNamespace::Create(const std::string& na
 TInMemNamespace::~TInMemNamespace()
 {
     for (const auto& cls : fClasses) {
+        // Handles of classes may outlive the extents, which are destroyed below.
         cls->NamespaceGoes();
     }
     fClassesByName.clear();
@@ -65,6 +66,7 @@ boost::shared_ptr<TInMemClass> TInMemNamespace::AllocateInMemClass(const std::st
     if (name.empty() || name == kRootClassName || isForeign) {
         throw TZELException(TZELStatusCode::kInvalidParameter);
     }
+    // Top-level classes have no superclass; only GetParent knows the pseudo-class.
     if (superClass == fRoot) {
         superClass.reset();
     }
@@ -133,6 +135,7 @@ void TInMemNamespace::Declare(const boost::shared_ptr<TInMemClass>& cls)
 {
     CheckDeclarable(*cls);
     TEntry entry{cls, std::make_unique<TInMemExtent>(cls->GetLayout())};
+    // If a later step fails, Withdraw undoes those that were done and ignores the others.
     cls->Enter(GetParent(*cls), *entry.extent);
     try {
         fClasses.push_back(cls);
@@ -149,6 +152,7 @@ void TInMemNamespace::Withdraw(TInMemClass& cls) noexcept
     cls.Leave(GetParent(cls));
     EraseLast(fClasses, [&keep](const boost::shared_ptr<TInMemClass>& other) { return other == keep; });
     const auto entry = fClassesByName.find(cls.GetName());
+    // Undoing a failed Declare must not remove another class of that name.
     if (entry != fClassesByName.end() && entry->second.cls == keep) {
         fClassesByName.erase(entry);
     }
@@ -162,6 +166,7 @@ boost::shared_ptr<TInMemQualifierDecl> TInMemNamespace::FindQualifierDecl(std::s
 
 void TInMemNamespace::AddQualifierDecl(boost::shared_ptr<TInMemQualifierDecl> decl)
 {
+    // A view of the name in the object, which the list keeps alive after the move below.
     const std::string_view name = decl->GetName();
     if (FindQualifierDecl(name)) {
         throw TZELException(TZELStatusCode::kAlreadyExists);

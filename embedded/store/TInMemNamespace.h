@@ -17,7 +17,7 @@ namespace NORVZEL20 {
 
 /// A namespace that holds classes, qualifier declarations and instances in memory.
 ///
-/// Owns its classes and instances; handles that outlive it stay valid (see TInMemClass and TInMemInstance). To load many things,
+/// It owns its classes and instances; handles that outlive it stay valid (see TInMemClass and TInMemInstance). To load many things,
 /// all or none of them, use TInMemStaging. Assignment takes nothing over.
 /// Threads: use a namespace, and everything in it, from one thread at a time; different namespaces may be used concurrently.
 class CIMDELTA_EXPORT TInMemNamespace final : public ICIMNamespace,

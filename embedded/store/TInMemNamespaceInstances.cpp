@@ -1,4 +1,7 @@
 // Finding, changing and removing instances by path.
+//
+// Only the class and the keys of the path count. Its key values are converted to the declared types first, because a path that was
+// read from text has types that are only guessed. The extent of the class then finds the instance by its keys.
 
 #include "embedded/store/TInMemExtent.h"
 #include "embedded/store/TInMemNamespace.h"
@@ -36,6 +39,7 @@ boost::shared_ptr<TInMemInstance> TInMemNamespace::FindInstance(const TCIMRefere
     for (const std::uint32_t slot : layout.GetKeys()) {
         keys.push_back(GetKey(path, layout.GetDecl(slot)));
     }
+    // A path with more keys than the class names no instance.
     return path.GetKeyCount() == keys.size() ? cls->GetExtent().Find(keys) : nullptr;
 }
 
@@ -70,6 +74,7 @@ void TInMemNamespace::ModifyInstance(const TCIMReference& path, TCallContext pro
             throw TZELException(TZELStatusCode::kNotFound);
         }
         TCIMValue fitting = layout.GetDecl(slot).Fit(value);
+        // A key may be named, but only with the value that it has.
         if (!layout.GetDecl(slot).IsKey()) {
             changes.emplace_back(slot, std::move(fitting));
         } else if (instance->GetSlotValue(slot) != fitting) {
@@ -89,6 +94,7 @@ void TInMemNamespace::ClearInstances()
     }
 }
 
+/// Only keys that are references have such texts; other classes keep their index.
 void TInMemNamespace::ReferenceTextsChanged()
 {
     for (const auto& cls : fClasses) {

@@ -3,8 +3,8 @@
 // A declaration that overrides one of an ancestor inherits its qualifiers. Key and Static hold for all who override the property,
 // even if their flavor forbids inheritance: instances of a subclass must have the keys of the superclass, and a static value is one
 // for all. The marks (key, static, generated, bag) are asked for with every value that is set, so they are worked out when a
-// qualifier or the overridden declaration changes, not when they are read. A key that ceases to be one would make instances equal
-// that were told apart by it; such a qualifier is refused while there are any.
+// qualifier or the overridden declaration changes, not when they are read. A qualifier that takes a key away is refused while the
+// class has instances, because two of them could then have equal keys.
 
 #include "embedded/store/TInMemPropertyDecl.h"
 
@@ -132,7 +132,7 @@ bool TInMemPropertyDecl::IsBagDeclared() const
     if (GetQualifiers().IsTrue("OctetString")) {
         return false;
     }
-    // DSP0004 makes an array a bag if nothing else is said.
+    // In DSP0004 an array without the qualifier is a bag.
     const auto arrayType = GetQualifiers().Find("ArrayType");
     if (!arrayType) {
         return true;

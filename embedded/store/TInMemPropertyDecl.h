@@ -15,7 +15,7 @@ class TInMemClass;
 
 /// A property's declaration in an in-memory class.
 ///
-/// Made by TInMemClass::AllocatePropertyDecl, given its qualifiers, then added with TInMemClass::AddPropertyDecl. From then on
+/// TInMemClass::AllocatePropertyDecl makes it; it gets its qualifiers and is added with TInMemClass::AddPropertyDecl. From then on
 /// AddQualifier throws kClassInUse (19) if a Key that is not true would take a key away from a class with instances.
 class CIMDELTA_EXPORT TInMemPropertyDecl : public TInMemNamedElement<ICIMPropertyDecl>,
                                            public boost::enable_shared_from_this<TInMemPropertyDecl> {

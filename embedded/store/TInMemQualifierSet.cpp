@@ -32,6 +32,7 @@ bool TInMemQualifierSet::HoldsTrue(const ICIMQualifier& qualifier)
 
 void TInMemQualifierSet::Add(boost::shared_ptr<ICIMQualifier> qualifier)
 {
+    // A replaced qualifier keeps its place in the order.
     for (auto& own : fOwn) {
         if (IsNamed(*own, qualifier->GetName(TCallContext()))) {
             own = std::move(qualifier);
@@ -68,6 +69,7 @@ void TInMemQualifierSet::Enumerate(const boost::function<bool(boost::shared_ptr<
     for (const TInMemQualifierSet* set = this; set; set = set->fParent) {
         const auto qualifiers = set->fOwn;  // the callback may add some
         for (const auto& qualifier : qualifiers) {
+            // Find decides whether an inherited one is visible: a nearer one may replace it, or its flavor may hold it back.
             const bool isSeen = set == this || Find(qualifier->GetName(TCallContext())) == qualifier;
             if (isSeen && !callback(qualifier)) {
                 return;

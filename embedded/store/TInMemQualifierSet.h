@@ -39,7 +39,7 @@ class CIMDELTA_EXPORT TInMemQualifierSet {
     bool IsTrue(std::string_view name) const;
     /// Whether the element itself has one of that name with the value TRUE.
     bool IsOwnTrue(std::string_view name) const;
-    /// Whether the element or an ancestor has one of that name with the value TRUE, whatever its flavor.
+    /// Whether the element or an ancestor has one of that name with the value TRUE, of any flavor.
     bool IsTrueAnywhere(std::string_view name) const;
 
     /// The element's own one of that name, or null.

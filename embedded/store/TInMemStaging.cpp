@@ -1,7 +1,7 @@
 // Loading all or nothing.
 //
-// Things are added to the namespace itself, not to a copy, so that later ones find earlier ones: a class its superclass, a
-// reference its instance. To undo this, the staging notes what it added. For classes and qualifier declarations that is a list. For
+// Things are added to the namespace itself, not to a copy, because later ones must find earlier ones: a class its superclass, a
+// reference its class. To undo this, the staging notes what it added. For classes and qualifier declarations that is a list. For
 // instances it is one mark for each extent, taken before the first instance goes in: everything behind the mark is new, because
 // nothing is removed meanwhile. Undoing goes backwards: static values, instances, classes with subclasses first, qualifier
 // declarations. None of these steps needs memory, so undoing cannot fail.

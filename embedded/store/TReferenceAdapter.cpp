@@ -40,6 +40,7 @@ TKeys GetKeys(const TCIMReference& path)
 TCIMReference MakePath(const TCIMReference& like, const boost::shared_ptr<ICIMClass>& cls, const TKeys& keys)
 {
     TCIMReference path(like.GetNamespace(), std::map<std::string, TCIMValue>());
+    // The namespace may be gone or unknown; its name stays in the path.
     if (path.GetNamespaceName() != like.GetNamespaceName()) {
         path.SetNamespaceName(like.GetNamespaceName());
     }
@@ -190,6 +191,7 @@ bool TReferenceAdapter::AdaptObject(TCIMValue& value) const
 
 void TReferenceAdapter::AdaptStatics(const TInMemClass& cls) const
 {
+    // Inherited static values are adapted with the class that declares them.
     for (const boost::shared_ptr<TInMemPropertyDecl>& decl : cls.GetLayout().GetOwnDecls()) {
         TCIMValue value = decl->GetStaticProperty().GetValue();
         if (decl->IsStatic() && Adapt(value)) {
@@ -204,6 +206,7 @@ bool TReferenceAdapter::AdaptInstance(TInMemInstance& instance, const std::vecto
     bool isKeyChanged = false;
     for (const std::uint32_t slot : slots) {
         const TCIMValue& stored = instance.GetSlotValue(slot);
+        // Most strings are plain text, in which there is nothing to adapt.
         if (TAccess::IsText(stored) || stored.IsNull()) {
             continue;
         }

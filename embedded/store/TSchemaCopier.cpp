@@ -43,6 +43,7 @@ std::vector<boost::shared_ptr<TInMemClass>> TSchemaCopier::CopyClass(const TInMe
     }
     std::vector<boost::shared_ptr<TInMemClass>> declared;
     TInMemStaging staging(fTarget);
+    // Superclasses first. If one fails, the staging is destroyed without Commit and takes all of them back.
     for (auto cls = missing.rbegin(); cls != missing.rend(); ++cls) {
         declared.push_back(MakeClass(**cls));
         staging.AddClass(declared.back());
@@ -76,6 +77,7 @@ boost::shared_ptr<TInMemPropertyDecl> TSchemaCopier::CopyPropertyDecl(const TInM
     if (cls.FindPropertyDecl(source.GetName())) {
         return nullptr;
     }
+    // Every class below gets the property too, so all are checked before anything is declared.
     CheckWidth(cls, cls.GetLayout().GetOrder().size() + 1);
     for (const auto& below : cls.GetClassesBelow()) {
         CheckWidth(*below, below->GetLayout().GetOrder().size() + (below->FindPropertyDecl(source.GetName()) ? 0 : 1));
@@ -123,6 +125,7 @@ bool TSchemaCopier::RespellProperty(TInMemClass& cls, const std::string& name)
         decl->SetSpelling(name);
         return true;
     }
+    // An inherited property is overridden by a copy, because the superclass keeps its spelling.
     const auto own = TDeclCopy::CopyProperty(*decl);
     own->SetSpelling(name);
     if (own->IsStatic()) {

@@ -63,7 +63,7 @@ void TValueAccess::StoreText(TCIMValue& value, std::string_view text) noexcept
 
 void TValueAccess::StoreDateTime(TCIMValue& value, const TCIMDateTime& time) noexcept
 {
-    // TCIMValue.cpp draws the layout; the numbers below are offsets in front of the microseconds.
+    // TCIMValue.cpp draws the layout. The last arguments are positions in fBytes.
     Store(value, time.fMicroseconds);
     Store(value, time.fOffset, 0);
     Store(value, time.fUnknown, 2);
