@@ -9,7 +9,7 @@ namespace NORVZEL20 {
 /// dots.
 std::string Quote(std::string_view text);
 
-/// That an object (a "class" or an "instance") has a property twice.
+/// The message that an object (a "class" or an "instance") has a property twice.
 std::string DescribeSecondProperty(std::string_view property, const char* object);
 
 /// What follows the name of a class that is needed but not declared.

@@ -37,6 +37,7 @@ boost::shared_ptr<TInMemClass> TCimXmlClassMaker::Make(const TCimXmlDraft& draft
             FailTooMany(TSchemaLimits::kMaxProperties, "properties", object.GetClassName());
         }
     }
+    // Overridden methods count again, as TSchemaLimits says.
     std::size_t methods = 0;
     for (const TInMemClass* above = super.get(); above != nullptr; above = above->GetSuperInMemClass().get()) {
         methods += above->GetMethods().GetOwn().size();
@@ -74,6 +75,7 @@ void TCimXmlClassMaker::AddProperty(TInMemClass& cls, const TEmbeddedObject::TPr
                                                   ", but a superclass declares it as " +
                                                   TValueText::DescribeType(inherited->GetType()));
     }
+    // A repetition of what the class inherits anyway. The type was compared above.
     if (inherited && property.propagated) {
         return;
     }
@@ -119,6 +121,7 @@ void TCimXmlClassMaker::AddQualifiers(TElement& element, const TQualifiers& qual
         if (inherited != nullptr) {
             above = inherited->Find(qualifier.name);
         }
+        // The element inherits this qualifier.
         if (above && qualifier.propagated) {
             continue;
         }

@@ -66,7 +66,7 @@ void TCimXmlClassQueue::DeclareNew()
     }
 }
 
-/// Tries a class again, whose superclass may have come meanwhile.
+/// Tries a stuck class again, because its superclass may have come meanwhile.
 void TCimXmlClassQueue::DeclareStuck(const char* name)
 {
     const auto known = fNumbers.find(name);

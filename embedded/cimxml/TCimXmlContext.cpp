@@ -2,7 +2,7 @@
 //
 // A document may name its namespace several times: in each group, and in the name in front of each object. The first name counts,
 // and any other is an error, because objects of two namespaces would fall together in one. The same holds for the host. A document
-// that names none has the default of TLoadReport, so that references to that default count as its own.
+// that names none has the default of TLoadReport, and references to that default count as its own.
 #include "embedded/cimxml/TCimXmlContext.h"
 
 #include <algorithm>

@@ -27,8 +27,8 @@ class CIMDELTA_INTERNAL_EXPORT TCimXmlContext {
         std::size_t column = 0;
     };
 
-    /// While it lives, errors and notes are reported at `place` and not where the document is being read: for what was read earlier
-    /// and is used only now. They may nest; the innermost counts.
+    /// While it lives, errors and notes are reported at `place` instead of the position being read. It is for parts that were read
+    /// earlier and are used only now. Objects may nest; the innermost counts.
     class TAt {
       public:
         TAt(TCimXmlContext& context, const TPlace& place) : fContext(context), fEarlier(context.fPlace) { context.fPlace = place; }
@@ -51,7 +51,7 @@ class CIMDELTA_INTERNAL_EXPORT TCimXmlContext {
     /// Ends the load. `message` says what was found and what was expected or can be done.
     [[noreturn]] void Fail(TZELStatusCode::EStatusCode status, const std::string& message) const;
 
-    /// The place of the innermost TAt, or else where the document is being read.
+    /// The place of the innermost TAt, or else the position being read.
     TPlace GetPlace() const;
 
     /// Notes in the report something odd that does not end the load. `kind` must be a string literal: the first call with it adds
@@ -69,7 +69,7 @@ class CIMDELTA_INTERNAL_EXPORT TCimXmlContext {
     TTextPool& GetTexts() noexcept { return fTexts; }
 
     /// Brackets the reading of an embedded object, whose errors say so. Errors: fails with kParseError (9) if objects are nested
-    /// too deeply. An error ends the load, so whoever throws need not leave.
+    /// too deeply. An error ends the load, so code that throws need not call LeaveEmbeddedObject.
     void EnterEmbeddedObject();
     void LeaveEmbeddedObject() noexcept { --fEmbeddedDepth; }
 

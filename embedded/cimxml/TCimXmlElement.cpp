@@ -91,6 +91,7 @@ constexpr std::array<unsigned char, kBuckets> MakeBuckets()
 {
     std::array<unsigned char, kBuckets> buckets{};
     for (unsigned char element = 1; element < E::kCount; ++element) {
+        // The table has more places than there are elements, so a free one is always found.
         std::size_t bucket = GetBucket(kNames[element]);
         while (buckets[bucket] != E::kUnknown) {
             bucket = (bucket + 1) % kBuckets;

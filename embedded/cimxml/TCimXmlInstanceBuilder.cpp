@@ -78,6 +78,7 @@ void TCimXmlInstanceBuilder::SetProperty(const TCimXmlTarget& target, TCIMValue&
         return;
     }
     fLate.NoteReference(fInstance, target.slot, fClasses.CountDeclared());
+    // A key that may change keeps this instance and all later ones of its class out of the namespace for now.
     fLayout->isHeld = fLayout->isHeld || fLayout->cls->GetLayout().GetDecl(target.slot).IsKey();
 }
 
@@ -110,6 +111,7 @@ void TCimXmlInstanceBuilder::Fill(const TCimXmlDraft& draft, const TReadObjects&
         const TEmbeddedObject::TProperty& property = object.GetProperties()[index];
         const TCimXmlTarget target = FindProperty(property.name.c_str());
         TCIMValue value = target.isEmbedded ? readObjects(property.value) : property.value;
+        // All classes are declared now, so references get their final form at once.
         adapter.Adapt(value);
         SetProperty(target, std::move(value), false);
     }

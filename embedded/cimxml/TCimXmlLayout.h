@@ -8,7 +8,7 @@
 
 namespace NORVZEL20 {
 
-/// What is looked up once for a class whose instances are read, so that each property is found fast. The vectors go by slot.
+/// What is looked up once for a class whose instances are read; it makes finding a property fast. The vectors are indexed by slot.
 struct TCimXmlLayout {
     explicit TCimXmlLayout(boost::shared_ptr<TInMemClass> cls);
 

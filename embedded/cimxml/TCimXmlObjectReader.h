@@ -17,7 +17,7 @@ namespace NORVZEL20 {
 /// declaration, kParseError (9) if objects are nested too deeply or what they hold is wrong.
 class TCimXmlObjectReader {
   public:
-    /// `ns` (may be null) is where the classes of references are looked up. `paths` is notified of references to classes that are
+    /// The classes of references are looked up in `ns` (may be null). `paths` is notified of references to classes that are
     /// not declared yet. `context` and `paths` must outlive the reader.
     TCimXmlObjectReader(TCimXmlContext& context, boost::shared_ptr<TInMemNamespace> ns, TCimXmlPathReader& paths);
     TCimXmlObjectReader(const TCimXmlObjectReader&) = delete;

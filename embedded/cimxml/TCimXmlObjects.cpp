@@ -64,6 +64,7 @@ TEmbeddedObject::TMethod FromMethodDecl(const ICIMMethodDecl& decl)
     if (inMemory == nullptr) {
         return method;
     }
+    // Only this host's declarations show their parameters.
     for (const boost::shared_ptr<TInMemParameter>& parameter : inMemory->GetParameters()) {
         method.parameters.push_back({parameter->GetName(), parameter->GetType(), parameter->GetReferenceClass(),
                                      parameter->GetArraySize(), FromQualifiers(*parameter, parameter.get())});
@@ -71,7 +72,7 @@ TEmbeddedObject::TMethod FromMethodDecl(const ICIMMethodDecl& decl)
     return method;
 }
 
-/// For a class of this host.
+/// Adds what a class of this host declares itself.
 void AddOwnElements(TEmbeddedObject& object, const TInMemClass& cls)
 {
     for (const boost::shared_ptr<TInMemPropertyDecl>& decl : cls.GetLayout().GetOwnDecls()) {
@@ -82,7 +83,7 @@ void AddOwnElements(TEmbeddedObject& object, const TInMemClass& cls)
     }
 }
 
-/// For a class of another host.
+/// Adds everything that a class of another host shows.
 void AddAllElements(TEmbeddedObject& object, const ICIMClass& cls)
 {
     const auto addProperty = [&](const boost::shared_ptr<ICIMPropertyDecl>& decl) {
@@ -107,6 +108,7 @@ std::vector<TElement> OwnOf(const std::vector<TElement>& elements)
             own.push_back(element);
         }
     }
+    // Properties and methods have qualifiers of their own, which may be propagated; qualifiers have none.
     if constexpr (!std::is_same_v<TElement, TEmbeddedObject::TQualifier>) {
         for (TElement& element : own) {
             element.qualifiers = OwnOf(element.qualifiers);

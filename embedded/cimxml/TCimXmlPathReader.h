@@ -22,7 +22,7 @@ namespace NORVZEL20 {
 /// a key's text is no value of its type.
 class TCimXmlPathReader {
   public:
-    /// `ns` (may be null) is where classes are looked up. `context` must outlive the reader.
+    /// Classes are looked up in `ns` (may be null). `context` must outlive the reader.
     TCimXmlPathReader(TCimXmlContext& context, boost::shared_ptr<TInMemNamespace> ns);
 
     /// Begins a path inside of the innermost one. Errors: kParseError (9) if paths are nested too deeply.

@@ -16,13 +16,12 @@ namespace NORVZEL20 {
 
 /// Loads CIM-XML documents (DSP0201) into a namespace: declarations in any kind of group, and recorded requests and responses.
 ///
-/// Order: classes may come in any order, and instances before their class. References are written as their classes are declared,
-/// wherever the declaration stands. There is one exception: a key value without a name needs its class in front of it.
+/// Order: classes may come in any order, and instances before their class. References are stored as their classes are declared,
+/// even if the declaration comes later. There is one exception: a key value without a name needs its class in front of it.
 /// Names: those of classes, properties and keys consist of ASCII letters, digits, underscores and characters beyond ASCII, so they
 /// cannot be confused with the punctuation of a path.
-/// Values: a property that an instance does not mention is null, whatever its default. A reference without a namespace, or to the
-/// document's own namespace (and host), is stored without one.
-/// All or nothing: if a load throws, the namespace is as it was.
+/// Values: a property that an instance does not mention is null, even if it has a default. A reference without a namespace, or to
+/// the document's own namespace (and host), is stored without one. All or nothing: if a load throws, the namespace is as it was.
 /// Errors of every load: TPopulateError with the statuses of TNamespacePopulator::PopulateFromXMLFile, or kNotSupported (31) if the
 /// namespace is not one of the provider "inmem"; std::bad_alloc. Nothing is logged.
 /// Threads: use a populator, and a namespace, from one thread at a time; different populators may load into different namespaces
@@ -39,7 +38,7 @@ class CIMDELTA_EXPORT TCimXmlPopulator {
     /// fails with that exception.
     using TPullSource = boost::function<std::size_t(char*, std::size_t)>;
 
-    /// The populator keeps `ns`, which is where it loads.
+    /// The populator loads into `ns` and keeps it alive.
     explicit TCimXmlPopulator(boost::shared_ptr<ICIMNamespace> ns);
 
     /// Loads the `length` bytes at `data`. Messages call the document `name`.

@@ -63,6 +63,7 @@ void TCimXmlReader::OnStart(const char* name, const char** attributes)
     if (step.action == TTable::kRefuse) {
         FailUnexpected(name);
     }
+    // The state is entered before the action runs, so an action sees its own element as the open one.
     fOpen.push_back({step.next, element});
     fText = std::string_view();
     fContext.Guard([&] { Begin(step.action, TCimXmlAttributes(fContext, element, attributes)); });
@@ -72,12 +73,13 @@ void TCimXmlReader::OnEnd(const char*)
 {
     CheckBlank();
     const TTable::EAction action = TTable::GetEndAction(GetState());
+    // The action at the end runs in the state around the element.
     fOpen.pop_back();
     fContext.Guard([&] { End(action); });
     fText = std::string_view();
 }
 
-/// Text where only elements may stand must be white space.
+/// If only elements may stand here, the text must be white space.
 void TCimXmlReader::CheckBlank() const
 {
     if (fText.empty() || TTable::TakesText(GetState())) {
@@ -211,7 +213,7 @@ void TCimXmlReader::EndObject()
     fPaths.Drop();
 }
 
-/// To be called when a class or an instance starts: a VALUE.OBJECT holds one, and the name in front of it gives the namespace.
+/// Call this when a class or an instance starts: a VALUE.OBJECT holds one, and the name in front of it gives the namespace.
 void TCimXmlReader::NoteObject()
 {
     if (GetOuterState() != TTable::kObject) {
@@ -320,6 +322,7 @@ void TCimXmlReader::EndProperty()
     if (!fIsDirect) {
         return fDraft.EndProperty(fProperty.Take());
     }
+    // A new instance has nulls already.
     if (!fProperty.IsNull()) {
         fLoader->SetProperty(fTarget, fProperty.Take(), fPaths.TakeMetUnknownClass());
     }
@@ -330,6 +333,7 @@ void TCimXmlReader::EndQualifier()
     TEmbeddedObject::TQualifier qualifier = fQualifier.Take();
     fItem = &fProperty;
     if (fIsDirect) {
+        // An instance has no qualifiers in the model, so there is nothing to keep.
         return fContext.Tolerate("qualifier of an instance",
                                  "qualifier " + Quote(qualifier.name) + " stands on an instance or its property; left out");
     }
@@ -338,6 +342,7 @@ void TCimXmlReader::EndQualifier()
 
 void TCimXmlReader::BeginValue()
 {
+    // The elements of an array belong to one value, which BeginArray has started.
     if (GetOuterState() != TTable::kArray) {
         fItem->BeginValue();
     }

@@ -24,8 +24,7 @@ namespace NORVZEL20 {
 /// Errors: the events fail through the context, with kParseError (9) for what the table does not accept.
 class TCimXmlReader : public TXmlReader::ISink {
   public:
-    /// `ns` (may be null) is where the classes of references are looked up. `context` and `loader` (may be null) must outlive the
-    /// reader.
+    /// The classes of references are looked up in `ns` (may be null). `context` and `loader` (may be null) must outlive the reader.
     TCimXmlReader(TCimXmlContext& context, const boost::shared_ptr<TInMemNamespace>& ns, TCimXmlLoader* loader);
 
     void OnStart(const char* name, const char** attributes) override;

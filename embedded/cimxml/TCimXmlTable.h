@@ -57,7 +57,7 @@ class CIMDELTA_INTERNAL_EXPORT TCimXmlTable {
         kKeyBinding,
         kKeyValue,
         kError,
-        kSkipped,  ///< an element that holds nothing to load, whatever is in it
+        kSkipped,  ///< an element with any contents, none of which is loaded
         kStateCount
     };
 

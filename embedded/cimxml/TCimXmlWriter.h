@@ -13,7 +13,7 @@
 
 namespace NORVZEL20 {
 
-/// Writes a namespace as CIM-XML (DSP0201), so that loading the document gives an equal namespace.
+/// Writes a namespace as CIM-XML (DSP0201). Loading the document gives an equal namespace.
 ///
 /// Text goes to the sink in pieces of about 64 KiB, in UTF-8; no more than that is held. Characters that XML readers would change
 /// are written as character references; a control character that XML 1.0 cannot carry becomes U+FFFD. The output depends on the

@@ -50,6 +50,7 @@ class TXmlParser::TEvents : public TXmlReader::ISink {
         if (fLength == 0) {
             return;
         }
+        // Forgotten before the call: a handler that asks for the text again must not get it twice.
         const std::size_t length = fLength;
         fLength = 0;
         fParser.characters(fText, static_cast<unsigned int>(length));
@@ -59,6 +60,7 @@ class TXmlParser::TEvents : public TXmlReader::ISink {
     {
         fReader.Reset();
         fLength = 0;
+        // An exception of a handler leaves Parse here and is not reported as an error of the document.
         if (!fReader.Parse(text, length, true)) {
             fParser.FatalError(fReader.GetError().c_str());
         }

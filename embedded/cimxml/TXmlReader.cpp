@@ -49,6 +49,7 @@ struct TXmlReader::TCallbacks {
     static void Start(void* user, const char* name, const char** attributes) noexcept
     {
         Guarded(user, [=](TXmlReader& reader) {
+            // The bounds are checked before the sink sees anything of the element.
             if (++reader.fDepth > kMaxDepth) {
                 return reader.Refuse("elements are nested too deeply");
             }
@@ -185,6 +186,7 @@ const char* TXmlReader::FindExcess(const char** attributes)
 bool TXmlReader::Parse(const char* data, std::size_t length, bool last)
 {
     while (!fStopped && (length > 0 || last)) {
+        // Half of the range leaves the library room for what it kept of the piece before.
         const std::size_t piece = std::min<std::size_t>(length, INT_MAX / 2);
         const bool final = last && piece == length;
         fBytes += piece;
@@ -234,6 +236,7 @@ bool TXmlReader::Settle(bool succeeded)
     }
     if (!succeeded) {
         const XML_Error code = XML_GetErrorCode(fParser.get());
+        // A lack of memory is no error of the document.
         if (code == XML_ERROR_NO_MEMORY) {
             throw std::bad_alloc();
         }

@@ -103,7 +103,7 @@ class CIMDELTA_INTERNAL_EXPORT TXmlReader {
     std::exception_ptr fException;
     bool fStopped = false;
     bool fRefusesDocumentTypes = false;
-    std::size_t fLine = 0;  // where the parse was stopped
+    std::size_t fLine = 0;  // of the place at which the parse was stopped
     std::size_t fColumn = 0;
 };
 
