@@ -1,3 +1,9 @@
+// Reading the command line with CLI11, and the one place that turns failures into an exit status.
+//
+// Each command has a record of its arguments, which CLI11 fills while it parses, and a callback, which only notes the function to
+// run. The command runs after parsing, so an exception of the command cannot be taken for a mistake in the arguments. Every failure
+// arrives in RunClient: it becomes one message and kExitTrouble (2).
+
 #include "client/CommandLine.h"
 
 #include <CLI/CLI.hpp>
@@ -103,6 +109,7 @@ class TCommandLine {
     CLI::App* AddCommand(const char* name, const char* description, std::function<int(IConsole&)> run)
     {
         CLI::App* command = fApp.add_subcommand(name, description);
+        // Only noted: it runs when the whole command line has been accepted.
         command->callback([this, run] { fCommand = run; });
         return command;
     }
@@ -133,6 +140,7 @@ class TCommandLine {
         AddText(command, "--schema", schemas,
                 "an inventory that the rules are for; repeat the option for several, the reference first")
             ->required()
+            // Otherwise the option would also take the arguments behind its value.
             ->allow_extra_args(false)
             ->option_text("INVENTORY");
     }

@@ -14,7 +14,7 @@ namespace NORVZEL20 {
 int RunQuery(const TQueryOptions& options, IConsole& console)
 {
     try {
-        // Parsed first, so that a wrong query is reported without waiting for the inventory.
+        // Parsed first: a wrong query is reported without waiting for the inventory.
         const TQuery query("WQL", options.query);
         const TInventory inventory = TInventoryLoader(console).LoadOne(options.inventory);
         const auto instances = Collect<ICIMInstance>([&](const auto& callback) { query.Execute(*inventory.ns, callback); });

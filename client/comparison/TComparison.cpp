@@ -1,6 +1,6 @@
 // A comparison in steps:
 //
-// (1) Complete the inventories, so that each declares what the others declare; with --strict-schema, leave them as they are.
+// (1) Complete the inventories: each then declares what the others declare. With --strict-schema, leave them as they are.
 // (2) Read the rules. If the person named no file, make rules that include every class, in a temporary file: the plug-in reads
 //     rules from files only.
 // (3) Find out what will be compared. This must be done before the run, which may add instances to the reference.
@@ -54,7 +54,7 @@ boost::shared_ptr<TDeltaNamespace> MakeDeltaNamespace()
 }
 
 // If a class excludes keys, the plug-in makes a class wrapper that owns its delta namespace, which owns the wrapper in turn: both
-// live until the process ends. The list, which is never destroyed, keeps them reachable, so that no leak is reported.
+// live until the process ends. The list is never destroyed and keeps them reachable, so no leak is reported.
 void KeepForever(const boost::shared_ptr<TDeltaNamespace>& records)
 {
     static auto* const fgKept = new std::vector<boost::shared_ptr<TDeltaNamespace>>;

@@ -13,8 +13,9 @@ namespace NORVZEL20 {
 /// One comparison of loaded inventories by the plug-in.
 class TComparison {
   public:
-    /// `inventories`, the reference first and at least two, and `console` must outlive this. The inventories are changed: all by
-    /// CompleteInventories, and the reference by a run with exactly one other inventory, which brings it in line with that one.
+    /// `inventories`, the reference first and at least two, and `console` must outlive this. The inventories may be changed: all
+    /// of them by CompleteInventories, and the reference by a run with exactly one other inventory, which brings it in line with
+    /// that one unless the two have different types, keys or static values.
     TComparison(std::vector<TInventory>& inventories, IConsole& console) : fInventories(inventories), fConsole(console) {}
 
     /// Compares under the rules of `rulesFile`, or, if that is empty, every class in every property. With `strictSchema` the

@@ -53,6 +53,7 @@ void TArchiveReader::Open()
     }
     archive_entry* entry = nullptr;
     const int header = archive_read_next_header(reader, &entry);
+    // Compressed data without any contents has no entry.
     fEmpty = header == ARCHIVE_EOF;
     if (header != ARCHIVE_OK && !fEmpty) {
         Fail();
@@ -65,6 +66,7 @@ std::size_t TArchiveReader::Read(char* buffer, std::size_t size)
         return 0;
     }
     const la_ssize_t count = archive_read_data(fArchive.get(), buffer, size);
+    // The library may deliver what it had before a failed read, so the fault is checked too.
     if (count < 0 || fFault) {
         Fail();
     }

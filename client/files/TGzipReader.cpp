@@ -1,6 +1,6 @@
 // A gzip file is a row of members: a header, deflated data, then the checksum and the length of the text. The texts of all members
-// are one text. zlib's inflate() decodes one member and verifies its end, so this reader alternates between two states: within a
-// member, where the file must not end, and between members, where it may end or go on with another member, but with nothing else.
+// are one text. zlib's inflate() decodes one member and verifies its end, so this reader alternates between two states. Within a
+// member the file must not end. Between members it may end or go on with another member, but with nothing else.
 //
 // zlib is called directly because libarchive, which reads the other kinds, does not compare the checksums of gzip.
 #include "client/files/TGzipReader.h"

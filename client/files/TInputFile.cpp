@@ -40,6 +40,7 @@ TInputFile::TInputFile(const std::string& path) : fName(path == "-" ? "standard 
 
 TInputFile::~TInputFile()
 {
+    // Standard input belongs to the process.
     if (fDescriptor != STDIN_FILENO) {
         close(fDescriptor);
     }
@@ -81,6 +82,7 @@ std::size_t TInputFile::ReadDescriptor(char* buffer, std::size_t size)
         const std::error_code reason = LastSystemError();
         if (reason == std::errc::resource_unavailable_try_again) {
             pollfd wait = {fDescriptor, POLLIN, 0};
+            // Waits without using the processor; errors show at the next read().
             poll(&wait, 1, -1);
         } else if (reason == std::errc::bad_file_descriptor && IsClosed(fDescriptor)) {
             throw TClientError(fName + ": cannot be read: it is closed");

@@ -25,7 +25,7 @@ class TUnfinishedFile {
     /// Closes the descriptor, if it is still open. Errors: std::system_error; it is closed all the same.
     void Close();
 
-    /// Gives the file its final name in place of whatever has that name. Errors: std::system_error; the file is still unfinished.
+    /// Gives the file its final name in place of what has that name. Errors: std::system_error; the file is still unfinished.
     void MoveTo(const std::string& path);
 
     /// Removes the unfinished files of the process, eight at most. A signal handler may call it: it takes no lock and no memory.
@@ -38,7 +38,7 @@ class TUnfinishedFile {
     std::string fPath;
     int fDescriptor = -1;
     bool fIsThere = false;
-    int fSlot = -1;  // where RemoveAll finds the path; -1: nowhere
+    int fSlot = -1;  // of the path in the list that RemoveAll reads; -1: none
 };
 
 }  // namespace NORVZEL20

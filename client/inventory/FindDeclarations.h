@@ -8,7 +8,7 @@
 
 namespace NORVZEL20 {
 
-// Look-ups that return null where the host throws kNotFound (15). Errors: every other failure of the host.
+// Look-ups that return null if the host throws kNotFound (15). Errors: every other failure of the host.
 
 /// The class of that name, or null.
 boost::shared_ptr<ICIMClass> FindClass(ICIMNamespace& ns, const std::string& name);

@@ -40,7 +40,7 @@ TCIMValue FindValue(const ICIMInstance& instance, const char* property)
     return FindPropertyDecl(*instance.GetClass(TCallContext()), property) ? ValueOf(instance, property) : TCIMValue();
 }
 
-// Of several instances the one with the smallest path, so that the order in the file has no influence.
+// Of several instances the one with the smallest path: the order in the file has no influence.
 boost::shared_ptr<ICIMInstance> FindStandardInstance(TInMemNamespace& ns)
 {
     boost::shared_ptr<ICIMInstance> first;
@@ -125,6 +125,7 @@ std::string DescribeConflict(const TInMemClass& declared, const TInMemNamespace&
 boost::shared_ptr<TInMemClass> DeclareAs(const TInventory& source, const TInMemClass& declared, const TInventory& inventory)
 {
     try {
+        // All or nothing: after a failure the inventory has none of the classes.
         TSchemaCopier(inventory.ns).CopyClass(declared);
     } catch (const TZELException&) {
         Refuse(inventory, "the class cannot be declared as in " + source.path + ", " + DescribeConflict(declared, *inventory.ns));
@@ -188,6 +189,7 @@ TCIMValue SomeValue(TCIMValue::TCIMType type, const std::string& className)
 
 void AddTypeProperty(const TInventory& inventory, TInMemClass& cls)
 {
+    // A class below may already have OSType with another type; the store would refuse without naming it.
     for (const boost::shared_ptr<TInMemClass>& below : cls.GetClassesBelow()) {
         const boost::shared_ptr<TInMemPropertyDecl> other = below->FindPropertyDecl(kOperatingSystemType);
         if (other && other->GetType() != TCIMValue::TCIMType::kUint16) {
@@ -210,6 +212,7 @@ void AddInstance(const TInventory& inventory, TInMemClass& cls)
         if (cls.GetLayout().GetDecl(slot).GetType().IsArray()) {
             Refuse(inventory, "its key " + cls.GetLayout().GetDecl(slot).GetName() + " is an array");
         }
+        // Every key gets a value; Name and OSType get better ones below if they can.
         instance->SetSlot(slot, SomeValue(cls.GetLayout().GetDecl(slot).GetType(), cls.GetName()));
     }
     const std::uint32_t name = cls.GetLayout().FindSlot(kNameProperty);

@@ -7,7 +7,8 @@
 
 namespace NORVZEL20 {
 
-/// The value of a property, by its name in any letter case. Errors: TZELException kNotFound (15) if the class has no such property.
+/// The value of a property, by its name in any letter case. Errors: TZELException with kNotFound (15) if the class has no such
+/// property.
 inline TCIMValue ValueOf(const ICIMInstance& instance, const std::string& property)
 {
     return instance.GetProperty(property, TCallContext())->GetValue(TCallContext());

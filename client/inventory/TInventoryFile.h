@@ -8,7 +8,7 @@
 
 namespace NORVZEL20 {
 
-/// The text of an inventory file: plain, or decompressed from gzip, xz or zstd, by its first bytes and whatever its name.
+/// The text of an inventory file: plain, or decompressed from gzip, xz or zstd. The first bytes decide, not the name.
 ///
 /// Threads: as IByteSource.
 class TInventoryFile : public IByteSource {

@@ -9,7 +9,7 @@
 namespace NORVZEL20 {
 
 /// Loads inventories, each into a namespace of its own: as many concurrently as the hardware has threads, at least 2 and at most
-/// 16, so that few files are open at a time.
+/// 16. The limit keeps few files open at a time.
 class TInventoryLoader {
   public:
     /// `console` must outlive this. It shows the progress, and a message for each fault that was tolerated in a file.

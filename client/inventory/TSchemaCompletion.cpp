@@ -8,7 +8,7 @@
 //   a type or the keys differ               that is noted, once for each pair of inventories
 // What an early source declares in a later one is there when that one is the source; so one pass over all makes the union.
 //
-// Stored references name classes and keys, hence those of changed inventories are rewritten at the end. Notes are sorted, because
+// Stored references name classes and keys. Those of changed inventories are rewritten at the end. Notes are sorted, because
 // they arise in the order of declaration, which depends on the tool that wrote the file.
 #include "client/inventory/TSchemaCompletion.h"
 

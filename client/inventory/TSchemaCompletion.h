@@ -8,7 +8,7 @@
 
 namespace NORVZEL20 {
 
-/// Declares in each inventory what the others declare, so that inventories with different schemas can be compared.
+/// Declares in each inventory what the others declare. Then inventories with different schemas can be compared.
 ///
 /// A class or property that an inventory lacks is declared there. A name that differs in letter case gets the spelling of the first
 /// inventory that has it, in stored references too. Instances are neither made nor removed; a property that is declared late is

@@ -5,7 +5,7 @@
 
 namespace NORVZEL20 {
 
-/// What was changed in an inventory's schema so that it could be compared, or what about it cannot be reconciled.
+/// A change of an inventory's schema that makes it comparable, or a difference that cannot be reconciled.
 struct TSchemaNote {
     enum EKind {
         kClassDeclared,        ///< a class that another inventory declares

@@ -3,7 +3,7 @@
 // A handler that called exit() would turn "killed by SIGINT" into an ordinary exit status, and a shell script would go on with its
 // next command. So the handler cleans up, restores the signal's default action and raises the signal again. The kernel blocks a
 // signal while its handler runs: the second one becomes pending, arrives when the handler returns, and ends the process by the
-// default action. The other ending signals are blocked as well, so that no second handler interrupts the clean-up.
+// default action. The other ending signals are blocked as well, so no second handler interrupts the clean-up.
 #include "client/process/EndingSignals.h"
 
 namespace NORVZEL20 {

@@ -4,7 +4,8 @@
 
 namespace NORVZEL20 {
 
-/// The signals with which somebody else ends a process, as far as it can handle them: SIGHUP, SIGINT, SIGQUIT, SIGTERM, SIGXCPU.
+/// The signals by which another process usually ends this one, as far as it can handle them: SIGHUP, SIGINT, SIGQUIT, SIGTERM,
+/// SIGXCPU.
 sigset_t EndingSignals() noexcept;
 
 /// From now on `cleanUp` is called before such a signal ends the process. To the parent the process still ends by that signal. A

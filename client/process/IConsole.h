@@ -5,7 +5,7 @@
 
 namespace NORVZEL20 {
 
-/// Where a command writes its result and its messages. Tests replace it.
+/// Takes the result and the messages of a command. Tests replace it.
 ///
 /// Threads: Say and ShowProgress may be called from any thread, WriteResult from one.
 class IConsole {
@@ -17,7 +17,7 @@ class IConsole {
     virtual void WriteResult(const std::string& text) = 0;
 
     /// Writes a line to standard error, escaped as by EscapeForDisplay; `line` comes without its end. Works without memory too:
-    /// then "?" stands for whatever would have to be escaped.
+    /// then "?" stands for everything that is not printable ASCII.
     virtual void Say(std::string_view line) noexcept = 0;
 
     /// Whether a result on standard output is to be coloured: it is a terminal, and NO_COLOR is not set.

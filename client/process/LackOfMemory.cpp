@@ -1,9 +1,9 @@
 // Memory that runs out ends a command like any other trouble: with one message and kExitTrouble (2).
 //
-// Nearly always the std::bad_alloc reaches RunClient, which reports it. But a library may allocate where no exception may leave:
-// the JSON library moves the children of a value into a vector when it destroys the value. The runtime then calls the terminate
-// handler, which by default aborts the process and leaves temporary files behind. The handler below replaces it. It needs no
-// memory, and ends by _exit, which runs no destructors: those could allocate again.
+// Nearly always the std::bad_alloc reaches RunClient, which reports it. But a library may allocate in a function that no exception
+// may leave: the JSON library moves the children of a value into a vector when it destroys the value. The runtime then calls the
+// terminate handler, which by default aborts the process and leaves temporary files behind. The handler below replaces it. It needs
+// no memory, and ends by _exit, which runs no destructors: those could allocate again.
 #include "client/process/LackOfMemory.h"
 
 #include <unistd.h>

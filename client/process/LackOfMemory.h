@@ -7,7 +7,7 @@ namespace NORVZEL20 {
 /// The message when there is no memory for a longer one.
 extern const char* const kNoMemory;
 
-/// Throws std::bad_alloc if the host's error is kOutOfMemory.
+/// Throws std::bad_alloc if the host's error is kOutOfMemory (4).
 void ThrowIfOutOfMemory(const TZELException& error);
 
 /// From now on, if std::bad_alloc leads to std::terminate, the process calls `cleanUp`, writes kNoMemory to standard error and ends

@@ -85,7 +85,7 @@ std::string WriteDocuments(const TJson& documents, EOutputFormat format)
 }
 
 // The namespace that the file named. A copy must name it too: a reference in it that names a namespace may mean this one or
-// another, and only this name tells which.
+// another, and a reader finds out only by this name.
 std::string NamespaceNameOf(const TInventory& inventory)
 {
     return inventory.loaded.namesNamespace ? inventory.loaded.namespaceName : std::string();

@@ -2,11 +2,11 @@
 //
 // A path can lead to three kinds of places. Links are followed by hand, one at a time, because the last one may lead to a file
 // that does not exist yet, and because a link below /proc/self/fd (/dev/stdout is one) stands for an open descriptor:
-//   an open descriptor    is written to as it is, so that the shell's >> still appends;
+//   an open descriptor    is written to as it is; the shell's >> still appends;
 //   a device or a pipe    is opened and written to;
 //   an ordinary file      is replaced: the text goes to a temporary file in the same folder (a rename cannot leave its file
 //                         system), which gets the old file's owner and rights, is synced, and takes the name over by rename().
-// Whatever fails or ends the process before the rename leaves the old file as it was.
+// A failure, or the end of the process, before the rename leaves the old file as it was.
 #include "client/report/ResultOutput.h"
 
 #include <fcntl.h>
@@ -60,7 +60,7 @@ std::optional<int> DescriptorNamed(const std::string& path)
     return NumberOf(std::string_view(path).substr(FolderOf(path).size()));
 }
 
-// Where a path leads.
+// The end of a path.
 struct TTarget {
     std::string path;               ///< at the end of all links, whether or not there is a file
     std::optional<int> descriptor;  ///< the open descriptor that it stands for, if it does

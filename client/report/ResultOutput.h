@@ -11,7 +11,7 @@ bool IsStandardOutput(const std::string& path);
 
 /// Writes a whole result to the file of that path, or to the console's standard output if IsStandardOutput(path).
 ///
-/// A file appears whole or not at all: whatever was there stays until the new text is on the disk. Links are followed and stay. A
+/// A file appears whole or not at all: what was there stays until the new text is on the disk. Links are followed and stay. A
 /// device, a pipe or an open descriptor (/dev/stdout) is written to, not replaced.
 /// Errors: TReaderGone if the reader has closed the pipe, else TClientError.
 void DeliverResult(IConsole& console, const std::string& path, const std::string& text);

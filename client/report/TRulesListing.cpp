@@ -29,6 +29,7 @@ const char* Verb(TCIMDiffEngine::propType treatment)
     return treatment == TCIMDiffEngine::INCLUDE ? "include" : "exclude";
 }
 
+// The plug-in lists an included property in the spelling of the rules, hence without regard to letter case.
 bool Contains(const std::vector<std::string>& names, const std::string& name)
 {
     return std::any_of(names.begin(), names.end(), [&name](const std::string& other) { return TNameText::Equal(other, name); });
@@ -118,6 +119,7 @@ void TRulesListing::WriteUnmatched()
 {
     std::string unmatched;
     for (const TRulesDocument::TElement& element : fDocument.elements) {
+        // The rules of an element also reach the classes below its class.
         if (CountWithSubclasses(*fSchema.ns, element.className) == 0) {
             unmatched += "  " +
                          EscapeForDisplay(fFile + ":" + std::to_string(element.line) + ": class " + element.className +
@@ -190,6 +192,7 @@ std::string TRulesListing::Verdict(const TInMemClass& cls, const std::string& pr
 std::string TRulesListing::Reason(const TInMemClass& cls, const std::string& property, bool isCompared) const
 {
     const TRuleTrace::TDecision decision = fTrace.Decide(cls.GetName(), property);
+    // The rules include it, but the plug-in does not compare it.
     if (!isCompared && decision.treatment == TCIMDiffEngine::INCLUDE && property == kCollectionTime) {
         return "because the time of collection is never compared if the default is include";
     }

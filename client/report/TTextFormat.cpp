@@ -11,8 +11,8 @@
 //   Compared: 1 class; ...
 //
 // "-" is an instance of the reference that others lack, "+" one that only others have, "~" one with changed values. A value of the
-// reference stands before the arrow; inventories with equal values share one behind it. If there are only two inventories, which
-// one is meant goes without saying, and the names in brackets and before values are left out.
+// reference stands before the arrow; inventories with equal values share one behind it. If there are only two inventories, the
+// names in brackets and before values are left out.
 #include "client/report/TTextFormat.h"
 
 #include <algorithm>

@@ -4,8 +4,9 @@
 //   3 classes have no instances in any inventory.
 //   Not compared, because the rules exclude every property: Process (12 / 7).
 //   Properties of Disk not compared: Caption, Model.
-//   Instances of Disk that share their key with another one, since the rules leave out Bus: 2 of web01; those of web01 were not
-//   compared. Declared in web02 as in web01: class Tape, Disk.Model. Made in web02: an instance of KALMO_OperatingSystem.
+//   Instances of Disk that share their key with another one, since the rules leave out Bus: 2 of web01; ...
+//   Declared in web02 as in web01: class Tape, Disk.Model.
+//   Made in web02: an instance of KALMO_OperatingSystem.
 //
 // Numbers with slashes between them are those of the inventories, the reference first.
 #include "client/report/TextCoverage.h"

@@ -7,7 +7,7 @@
 //     the mark of Size:           "Size" \1 "0" = 1     "Size" \1 "1" = 0     "Size" \1 "2" = 1
 //     the mark of the default:    ""     \1 "0" = 1     ""     \1 "1" = 0     ""     \1 "2" = 1
 //
-// Every mark has the same number of digits, so that a mark replaces an earlier one as a whole. After the merge, the marks of a
+// Every mark has the same number of digits, so a mark replaces an earlier one as a whole. After the merge, the marks of a
 // class are the positions of the elements that decide there. Excluded keys are only ever copied together; the position takes their
 // place as one text. Made-up names cannot meet real ones, because the character \1 cannot occur in XML.
 #include "client/rules/TRuleMarks.h"

@@ -1,5 +1,5 @@
-// The elements are merged one after the other, as marks that say which element decides where (TRuleMarks). Warnings come from
-// looking at the marks around each merge:
+// The elements are merged one after the other, as marks that say which element decides what in a class (TRuleMarks). Warnings come
+// from looking at the marks around each merge:
 //
 //     before   rules of the class are complete             the element has no effect
 //              the class has rules already                 its excluded keys have no effect
@@ -70,6 +70,7 @@ void TRuleTrace::Apply(std::size_t index)
     WarnOfLateness(index);
     fMarks.Merge(index);
     WarnOfOverruled(index);
+    // insert keeps the first element of a class.
     fFirst.insert({fElements[index].className, index});
 }
 
@@ -77,6 +78,7 @@ void TRuleTrace::WarnOfLateness(std::size_t index)
 {
     const TRulesDocument::TElement& element = fElements[index];
     const std::optional<std::size_t> decider = fMarks.FindDefault(element.className);
+    // No rules have reached the class, so this element has its full effect.
     if (!decider) {
         return;
     }

@@ -1,3 +1,7 @@
+// The client must not guess what rules mean: the plug-in's own parser reads them, and the plug-in's own engine answers what they
+// compare. The file is checked first, because the plug-in's errors for a file that it cannot read name neither the file nor the
+// reason.
+
 #include "client/rules/TRules.h"
 
 #include <sys/stat.h>
@@ -52,6 +56,7 @@ std::string ReadWhole(const std::string& path)
 }  // namespace
 
 TRules::TRules(boost::shared_ptr<ICIMNamespace> schema, const std::string& file, const std::string& shownName)
+    // With a single namespace the engine neither checks operating systems nor reads a file; it only answers questions.
     : fSchemas(1, schema), fEngine(boost::shared_ptr<ICIMNamespace>(), fSchemas, std::string())
 {
     CheckFile(file);
@@ -91,6 +96,7 @@ bool TRules::HasExcludedKeys() const
 
 boost::shared_ptr<TCIMDiffEngine::TDiffClassRules> TRules::Find(const std::string& className)
 {
+    // A look-up costs a search by name, and keys are asked for instance by instance.
     if (!fFound || fFoundName != className) {
         fFound = fRuleset.getClassRules(className);
         fFoundName = className;

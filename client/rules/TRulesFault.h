@@ -4,7 +4,7 @@
 
 namespace NORVZEL20 {
 
-/// Why the plug-in refused a rules file, and where.
+/// Why the plug-in refused a rules file, and the line.
 struct TRulesFault {
     enum EKind {
         kMalformed,              ///< not well-formed XML; `text` is the parser's reason

@@ -98,7 +98,7 @@ void TRulesParser::EndElement(const char* name)
     }
 }
 
-// Called for malformed XML, and by the plug-in for whatever it refuses. What it refuses is described better by the callers above.
+// Called for malformed XML, and by the plug-in for everything that it refuses. The callers above describe the latter better.
 void TRulesParser::FatalError(const char* message)
 {
     fFault = MakeFault(TRulesFault::kMalformed, message);
@@ -118,7 +118,7 @@ void TRulesParser::NoteStart(const std::string& name)
 
 void TRulesParser::NoteFault(const char* reason, const TRulesFault& fault)
 {
-    // Whatever does not come from FatalError comes from the schema.
+    // An exception that does not come from FatalError comes from the schema.
     if (fFault.kind == TRulesFault::kSchemaFailed) {
         fFault.text = reason;
         return;

@@ -9,10 +9,10 @@
 
 namespace NORVZEL20 {
 
-/// The plug-in's parser, which also notes what it reads and where.
+/// The plug-in's parser, which also notes what it reads, with the lines.
 ///
 /// The plug-in's operations decide everything: what they accept is noted in the document, what they refuse is the fault. The
-/// plug-in logs each fault as usual. For one document; one thread.
+/// plug-in logs each fault as usual. Use it for one document, from one thread.
 class TRulesParser : public TCIMDiffEngine::TDiffXMLParser {
   public:
     explicit TRulesParser(boost::shared_ptr<ICIMNamespace> schema);

@@ -1,6 +1,6 @@
 // Names and values come from files that anybody may have written, and are shown on a terminal. There an escape sequence can move
 // the cursor or rename the window, a line end can fake a line of the report, and a mark of direction can make a name read as
-// another one. So text is decoded as UTF-8, character by character, and whatever is not plainly visible is replaced:
+// another one. So text is decoded as UTF-8, character by character, and everything that is not plainly visible is replaced:
 //
 //   line end, tab                                          \n \r \t
 //   other control characters below U+0080                  \x1b
@@ -8,7 +8,7 @@
 //   marks of direction, line and paragraph separators      \u202e
 //   bytes that are not UTF-8                               \xff
 //
-// A value is also quoted if a reader could not otherwise say where it begins and ends, or which of its backslashes are its own.
+// A value is also quoted if a reader could not otherwise see its beginning and end, or which of its backslashes are its own.
 #include "client/text/DisplayText.h"
 
 #include "embedded/value/TUtf8.h"
