@@ -1,3 +1,6 @@
+// Texts for comparing. They hold everything that a test may depend on, in an order that does not depend on addresses, so a test can
+// compare one text instead of many values.
+
 #include "tests/support/Dump.h"
 
 #include <set>

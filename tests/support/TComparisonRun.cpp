@@ -1,3 +1,7 @@
+// Setting up a comparison. The watched objects stand between the plug-in and the host: the store is replaced after the delta
+// namespace has been made, and the compared namespaces are wrapped when they join the compare list. The destructor forgets the
+// wrappers of classes, which would otherwise keep their delta namespace alive.
+
 #include "tests/support/TComparisonRun.h"
 
 #include <algorithm>

@@ -1,3 +1,6 @@
+// What the plug-in needs is implemented as simply as possible; everything else refuses with kNotSupported (31), so a test fails if
+// the plug-in starts to call it.
+
 #include "tests/support/plain/TPlainClass.h"
 
 #include <algorithm>

@@ -1,3 +1,6 @@
+// Everything is stored in the simplest container and searched without an index. Tests have few objects, and a simple host is easy
+// to trust.
+
 #include "tests/support/plain/TPlainNamespace.h"
 
 #include <boost/smart_ptr/make_shared.hpp>

@@ -32,7 +32,7 @@ class TCallWatch {
     void Forget() { fLines.clear(); }
 
     /// Records a call. Watched objects call this before they forward one. `caller` is the return address of their operation.
-    /// Errors: TZELException where this call is to fail.
+    /// Errors: TZELException if this call is to fail.
     void Called(const std::string& line, const void* caller = __builtin_return_address(0));
 
   private:

@@ -1,3 +1,7 @@
+// Each operation records its line, which may fail the call, and then forwards the call. Classes and instances in the answers are
+// wrapped in turn, and so are the declarations of an enumeration. Classes in arguments are unwrapped first, because the class
+// inside knows only its own objects.
+
 #include "tests/support/watched/TWatchedClass.h"
 
 #include <boost/smart_ptr/make_shared.hpp>

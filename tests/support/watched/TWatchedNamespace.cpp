@@ -1,3 +1,7 @@
+// Each operation records its line, which may fail the call, and then forwards the call. What the watched namespace returns is
+// wrapped in turn, so the calls on it are recorded too. Only TWatchedClass::Unwatched takes a wrapper off: an argument must reach
+// the namespace as the object that it knows.
+
 #include "tests/support/watched/TWatchedNamespace.h"
 
 #include <boost/smart_ptr/make_shared.hpp>
