@@ -1,3 +1,6 @@
+// The operations of a delta namespace when memory runs out, one by one. Each action checks after every failed allocation that the
+// object is as before, and that the same operation then succeeds. Runs have tests of their own (RunFaultTest.cpp).
+
 #include <gtest/gtest.h>
 
 #include "engine/TCIMDiffEngine.h"

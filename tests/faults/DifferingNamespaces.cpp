@@ -1,3 +1,8 @@
+// The contents. Disks differ by values, by references and by presence, in a class and in its subclass. Slots have keys that differ
+// between all namespaces, so they match only if the rules exclude bus and shelf; then references to them are compared without these
+// keys too. Ghost exists in the reference alone and has no instances. Texts are long enough to need an allocation, which can then
+// fail.
+
 #include "tests/faults/DifferingNamespaces.h"
 
 #include <vector>

@@ -13,16 +13,16 @@ namespace NORVZEL20 {
 /// A flaw that makes a run over them fail.
 enum class EFlaw {
     kNone,
-    kNoSlots,          ///< the last namespace lacks the class Slot: status 37 after the records of disks
-    kNoUplinkOfSlots,  ///< its slots lack the property Uplink: status 15, the host's answer, after the same records
-    kUnknownProperty,  ///< the specification names a property that nothing has: status 9 before any record
+    kNoSlots,          ///< the last namespace lacks the class Slot: kSchemaMismatch (37) after the records of disks
+    kNoUplinkOfSlots,  ///< its slots lack the property Uplink: kNotFound (15) of the host after the same records
+    kUnknownProperty,  ///< the specification names an unknown property: kParseError (9) before any record
 };
 
 /// Declares the classes Disk, Ssd (below Disk), Slot and, in namespace 0 only, Ghost, and adds the instances of namespace `index`.
 /// Flaws of the rules are ignored here.
 void FillDiffering(TNamespaceBuilder& builder, std::size_t index, EFlaw flaw = EFlaw::kNone);
 
-/// Declares the classes of namespace 0 and copies all instances of `reference`, with whatever runs have changed in it.
+/// Declares the classes of namespace 0 and copies all instances of `reference`, including what runs have changed in them.
 void FillLike(TNamespaceBuilder& builder, boost::shared_ptr<ICIMNamespace> reference);
 
 /// A specification that compares everything except Disk.Note and Ssd.Size. With excluded keys, slots are matched by their number

@@ -18,7 +18,7 @@ class IFaultyAction {
     virtual void Verify(const std::string& outcome) = 0;
 };
 
-/// How a call ended: "" for a return, "bad_alloc", "status 37" for a TZELException, "another exception".
+/// How a call ended: "" for a return, "bad_alloc", "status 37" for a TZELException with kSchemaMismatch (37), "another exception".
 std::string OutcomeOf(const std::function<void()>& call);
 
 /// Repeats the action with the first, second, ... allocation failing, until a run makes fewer allocations than that. Verifies after

@@ -1,3 +1,6 @@
+// A run in which one call of the host fails, once for each call. TRunCalls predicts from the calls of an untouched run how it ends,
+// so the expectation does not come from a failed run itself.
+
 #include <gtest/gtest.h>
 
 #include <iostream>
@@ -110,7 +113,7 @@ TEST_P(FailingHost, TakesNotFoundForAnAnswerWhereAClassMayBeMissing)
 INSTANTIATE_TEST_SUITE_P(Faults, FailingHost, testing::ValuesIn(TDiffering::All()),
                          [](const auto& test) { return test.param.GetName(); });
 
-/// kOutOfMemory gets no special treatment, so half of the combinations are enough.
+/// kOutOfMemory (4) gets no special treatment, so half of the combinations are enough.
 class TFailingHostWithoutMemoryFixture : public TFailingHostFixture {};
 using FailingHostWithoutMemory = TFailingHostWithoutMemoryFixture;
 

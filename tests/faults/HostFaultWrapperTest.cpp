@@ -1,3 +1,6 @@
+// A walk through class wrappers in which one call of the host fails, once for each call. Afterwards the same delta namespace must
+// answer as if nothing had happened: a failed call must not leave a half-made wrapper in the cache.
+
 #include <gtest/gtest.h>
 
 #include <iostream>

@@ -1,3 +1,6 @@
+// Loading an inventory when memory runs out, when the source throws and when the file has faults. A load is all or nothing, so the
+// text of the whole namespace is compared before and after; then the same load must succeed.
+
 #include <gtest/gtest.h>
 
 #include <cerrno>

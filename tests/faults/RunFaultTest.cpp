@@ -1,3 +1,6 @@
+// A whole run when memory runs out, once for each allocation that it makes. A failed run leaves the records that it had written, no
+// more and no fewer, and the next run is complete (TFaultyRun).
+
 #include <gtest/gtest.h>
 
 #include <numeric>

@@ -1,3 +1,6 @@
+// Reading a specification file that does not behave: it fails in its middle, comes in small pieces, or is another one than when its
+// size was asked for. The size is asked of the host and the file is opened afterwards, so a change in between is possible.
+
 #include <gtest/gtest.h>
 
 #include <cerrno>

@@ -1,3 +1,6 @@
+// The store when memory runs out: each change is made completely or not at all, and the same change succeeds afterwards. Every test
+// fails the first allocation of the change, then the second, and so on, until the change needs no more.
+
 #include <gtest/gtest.h>
 
 #include <boost/smart_ptr/make_shared.hpp>

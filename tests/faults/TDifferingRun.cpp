@@ -1,3 +1,7 @@
+// What a failed run may leave behind: any number of the first records of a complete run, and, with two namespaces, a reference that
+// is changed in part. So the result of the next run is compared with a first run over a copy of that reference, which knows nothing
+// of the failure.
+
 #include "tests/faults/TDifferingRun.h"
 
 #include <gtest/gtest.h>

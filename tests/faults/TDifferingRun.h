@@ -38,12 +38,12 @@ struct TCompared {
 
 /// The result of a run in which nothing is made to fail.
 struct TUntouchedRun {
-    std::string outcome;               ///< as OutcomeOf tells it
-    std::string log;                   ///< as TCapturingLogger tells it
-    std::vector<std::string> records;  ///< as TraceRecords tells them
-    std::string before;                ///< namespace 0 before, as DumpDiffering tells it
+    std::string outcome;               ///< the text of OutcomeOf
+    std::string log;                   ///< the text of TCapturingLogger
+    std::vector<std::string> records;  ///< the texts of TraceRecords
+    std::string before;                ///< namespace 0 before, the text of DumpDiffering
     std::string reference;             ///< namespace 0 afterwards
-    std::string aliases;               ///< as DumpAliases tells them
+    std::string aliases;               ///< the text of DumpAliases
 };
 
 /// Makes differing namespaces and runs over them once.

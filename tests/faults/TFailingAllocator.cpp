@@ -1,3 +1,6 @@
+// The program's own operator new and delete. Every block carries its size, so releasing it can be counted. The order to fail
+// belongs to one thread, because allocations of other threads must not use up its count.
+
 #include "tests/faults/TFailingAllocator.h"
 
 #include <algorithm>
@@ -38,7 +41,7 @@ bool IsToFail() noexcept
     return true;
 }
 
-/// Each block starts with a head that ends with its size. The head is as long as the alignment, so that the memory after it is
+/// Each block starts with a head that ends with its size. The head is as long as the alignment, so the memory after it is
 /// aligned.
 std::size_t HeadLength(std::size_t alignment) noexcept
 {

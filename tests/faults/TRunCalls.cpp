@@ -1,3 +1,12 @@
+// The prediction. A line of a recorded call says what the run was doing:
+//
+//   up to the last call for KALMO_OperatingSystem    the check of the operating systems
+//   from there to the first call for "<root>"        the specification: class tags, value tags, rules pushed down
+//   from there on                                    the comparison
+//
+// The phase decides the status and the log entries of a failure. The number of records is that of the KALMO_ instances added by
+// then.
+
 #include "tests/faults/TRunCalls.h"
 
 #include <algorithm>

@@ -16,8 +16,8 @@ class TRunCalls {
 
     /// How a run ends.
     struct TEnd {
-        std::string outcome;  ///< as OutcomeOf tells it
-        std::string log;      ///< as TCapturingLogger tells it
+        std::string outcome;  ///< the text of OutcomeOf
+        std::string log;      ///< the text of TCapturingLogger
     };
 
     TRunCalls() = default;

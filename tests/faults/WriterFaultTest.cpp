@@ -1,3 +1,6 @@
+// Writing CIM-XML when memory runs out, and when an instance fails half-way. The same writer must then write a correct document,
+// because it keeps a buffer from one call to the next.
+
 #include <gtest/gtest.h>
 
 #include "embedded/cimxml/TCimXmlWriter.h"
