@@ -72,7 +72,7 @@ class TClientFixture : public ::testing::Test {
         return std::string(std::istreambuf_iterator<char>(file), std::istreambuf_iterator<char>());
     }
 
-    /// The text with `name` in place of every occurrence of the path: expectations cannot know where scratch files are.
+    /// The text with `name` in place of every occurrence of the path, because expectations cannot know the folder of scratch files.
     static std::string Shorten(std::string text, const std::string& path, const std::string& name)
     {
         for (std::size_t at = text.find(path); at != std::string::npos; at = text.find(path, at + name.size())) {

@@ -1,4 +1,4 @@
-// Whatever a rules file holds, the commands that read one agree on whether it can be used, and why not.
+// The commands that read a rules file agree on whether it can be used, and why not.
 #include <algorithm>
 #include <filesystem>
 

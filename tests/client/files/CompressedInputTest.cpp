@@ -1,3 +1,6 @@
+// Damage to compressed files. One bit of each byte is flipped, and each length is tried. A flipped bit must be found unless it lies
+// in a part of the header that has no influence on the text; a cut must be found everywhere.
+
 #include <zlib.h>
 
 #include <utility>

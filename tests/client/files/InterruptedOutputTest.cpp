@@ -1,3 +1,6 @@
+// The promise of --output: the file appears whole or not at all. The program is really killed here, at a moment that is found by
+// watching its folder.
+
 #include <fcntl.h>
 #include <sys/ioctl.h>
 #include <sys/resource.h>
@@ -17,7 +20,7 @@ namespace {
 const char kLarge[] = CIMDELTA_PAIR_DATA "/a.xml.xz";
 const char kBefore[] = "what was there before";
 
-/// Results that do not arrive: the program is killed on the way, or whoever reads the result goes away or waits.
+/// Results that do not arrive: the program is killed on the way, or the reader of the result goes away or waits.
 class InterruptedOutputTest : public TProgramFixture {
   protected:
     void SetUp() override

@@ -1,3 +1,6 @@
+// Reads that fail, are interrupted or deliver little, for each kind of compression: the library that decompresses must pass the
+// reason on, and small pieces must not change the text.
+
 #include <atomic>
 #include <cerrno>
 #include <chrono>

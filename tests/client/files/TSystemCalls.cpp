@@ -1,3 +1,6 @@
+// Watch functions run outside of the lock, so one of them may wait while other threads go on. gCalls changes only while no command
+// runs.
+
 #include "tests/client/files/TSystemCalls.h"
 
 #include <fcntl.h>

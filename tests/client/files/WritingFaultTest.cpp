@@ -1,3 +1,6 @@
+// Every system call on the way of a result fails in turn, with each error that a full or broken disk gives. The old file must stay,
+// and no temporary file may be left.
+
 #include <sys/stat.h>
 
 #include <cerrno>

@@ -1,3 +1,6 @@
+// Commands when memory runs out: a command either is not affected or ends in order. Exhaust fails each allocation of the main
+// thread in turn, within the test. Spend fails every seventh one, each in a child, because the process may terminate.
+
 #include <gtest/gtest.h>
 #include <sys/wait.h>
 #include <unistd.h>
@@ -58,7 +61,8 @@ struct TCommand {
     std::string err;
 };
 
-/// Runs a command while memory runs out. Either that has no effect, or the command ends with status 2, a message and no result.
+/// Runs a command while memory runs out. Either that has no effect, or the command ends with kExitTrouble (2), a message and no
+/// result.
 class TRunCommand : public IFaultyAction {
   public:
     explicit TRunCommand(const TCommand& command) : fCommand(command) {}

@@ -1,3 +1,6 @@
+// The trace is checked in two ways that share no code with it: it must agree with the plug-in's own merge on random rules, and the
+// element that it names must be the one whose change makes a difference.
+
 #include "client/rules/TRuleTrace.h"
 
 #include <gtest/gtest.h>

@@ -1,3 +1,5 @@
+// What the parser notes while the plug-in reads. Documents are written as text here, and lines count from 1.
+
 #include "client/rules/TRulesParser.h"
 
 #include <gtest/gtest.h>
