@@ -10,7 +10,8 @@
 
 namespace NORVZEL20 {
 
-/// Finds out what a comparison will look at. To be used before the run: with two inventories that adds instances to the first one.
+/// Finds out what a comparison will look at. Use it before the run: a run over two inventories adds
+/// instances to the first one.
 class TCoverageBuilder {
   public:
     /// The arguments must outlive this. The inventories are those of the run, in its order.

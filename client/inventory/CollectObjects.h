@@ -11,7 +11,7 @@
 
 namespace NORVZEL20 {
 
-// What the host's enumerations call back with, as vectors in the order of the calls, repeated elements included.
+// The elements of the host's enumerations as vectors, in the order of the callbacks, repeated elements included.
 // All calls are made with an empty call context. Errors: those of the enumeration.
 
 /// The elements of any enumeration; `enumerate` is called once, with the callback to hand on.

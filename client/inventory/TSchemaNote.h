@@ -18,8 +18,8 @@ struct TSchemaNote {
     };
 
     EKind kind;
-    std::size_t inventory;  ///< the position of the one that was changed, or differs
-    std::size_t source;     ///< the position of the one whose declaration was taken; `inventory` itself for kOperatingSystemMade
+    std::size_t inventory;  ///< the position of the inventory that was changed or differs
+    std::size_t source;  ///< the position of the inventory whose declaration was taken; `inventory` itself for kOperatingSystemMade
     std::string className;
     std::string property;  ///< empty if the note is about a class
     std::string before;    ///< the spelling before, of a note about spelling; else empty

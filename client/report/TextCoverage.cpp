@@ -153,7 +153,7 @@ class TStatement {
         }
     }
 
-    // The line for a note that is not about a declaration; empty for one that is.
+    // The line for a note, unless the note is about a declaration; then empty.
     std::string Special(const TSchemaNote& note) const
     {
         const std::string element = EscapeForDisplay(note.className + (note.property.empty() ? "" : "." + note.property));

@@ -30,6 +30,7 @@ void CheckFile(const std::string& file)
     if (file.find(kNoRulesMarker) != std::string::npos) {
         throw TClientError(file + ": a rules file cannot have " + kNoRulesMarker + " in its name; rename it");
     }
+    // The plug-in would report all of the following as a file error without a reason, or as a parse error without a line.
     if (stat(file.c_str(), &status) != 0) {
         throw TClientError(file + ": cannot be opened", LastSystemError());
     }

@@ -33,15 +33,15 @@ class CIMDELTA_INTERNAL_EXPORT TCimXmlClassQueue {
     /// is called. Errors: those of TCimXmlClassMaker.
     boost::shared_ptr<TInMemClass> Find(const char* name);
 
-    /// Declares all that wait; for the end of the document. Errors: kNotFound (15) for a class whose superclass never came, or
-    /// which is below itself; those of TCimXmlClassMaker.
+    /// Declares all classes that wait. Call it at the end of the document. Errors: kNotFound (15) for a class whose superclass
+    /// never came, or which is below itself; those of TCimXmlClassMaker.
     void DeclareAll();
 
     /// How many classes have been declared.
     std::size_t CountDeclared() const noexcept { return fDeclared; }
-    /// How often classes were looked at in order to declare them, for those who bound the work.
+    /// How often classes were looked at in order to declare them, for callers that bound the work.
     std::size_t CountTried() const noexcept { return fTried; }
-    /// The declared classes in the document's order; for after DeclareAll.
+    /// The declared classes in the document's order. Call it after DeclareAll.
     std::vector<boost::shared_ptr<ICIMElement>> GetClasses() const;
 
   private:

@@ -21,7 +21,7 @@ class TXmlReader;
 /// Threads: one at a time, as the load that it belongs to.
 class CIMDELTA_INTERNAL_EXPORT TCimXmlContext {
   public:
-    /// Where something stands in the document, counted from 1.
+    /// A place in the document, counted from 1.
     struct TPlace {
         std::size_t line = 0;
         std::size_t column = 0;
@@ -45,7 +45,7 @@ class CIMDELTA_INTERNAL_EXPORT TCimXmlContext {
     explicit TCimXmlContext(std::string file);
     ~TCimXmlContext();
 
-    /// Sets the XML reader that knows the place; to be called before the load begins. The reader must outlive the load.
+    /// Sets the XML reader that knows the place. Call it before the load begins. The reader must outlive the load.
     void SetReader(const TXmlReader& reader) noexcept { fReader = &reader; }
 
     /// Ends the load. `message` says what was found and what was expected or can be done.

@@ -17,7 +17,7 @@ namespace NORVZEL20 {
 /// the document has ended.
 class TCimXmlLateInstances {
   public:
-    /// An instance that is filled but not added, and where it stands in the document.
+    /// An instance that is filled but not added, with its place in the document.
     struct THeld {
         boost::shared_ptr<TInMemInstance> instance;
         TCimXmlContext::TPlace place;
@@ -40,7 +40,8 @@ class TCimXmlLateInstances {
         fDeclaredBefore = fReferences.empty() ? declared : fDeclaredBefore;
         fReferences.emplace_back(instance, slot);
     }
-    /// Writes the noted references as their classes, of which `declared` are declared by now, say. To be called before TakeHeld.
+    /// Writes the noted references again, with the keys as their classes declare them. `declared` is how many classes are declared
+    /// by now. Call it before TakeHeld.
     void ResolveReferences(const TInMemNamespace& ns, std::size_t declared);
 
     /// Those that were held and those that waited, each once and in the document's order.

@@ -49,14 +49,15 @@ class CIMDELTA_INTERNAL_EXPORT TCimXmlLoader {
     void EndInstance(const TOwnKeys* ownKeys);
     void AddInstance(TCimXmlDraft draft) { fLate.Wait(std::move(draft)); }
 
-    /// Adds what waits; for the end of the document. Errors: kNotFound (15) for a class that never came, and those of the others.
+    /// Adds what waits. Call it at the end of the document. Errors: kNotFound (15) for a class that never came, and those of the
+    /// others.
     void Finish(const TReadObjects& readObjects);
     /// Keeps what was added.
     void Commit() noexcept { fStaging.Commit(); }
 
     /// From now on remembers the instances, for TakeElements.
     void KeepElements() { fKeep = true; }
-    /// Classes, then instances, each in the document's order; empty without KeepElements. For after Finish.
+    /// Classes, then instances, each in the document's order; empty without KeepElements. Call it after Finish.
     std::vector<boost::shared_ptr<ICIMElement>> TakeElements();
 
     /// See TCimXmlClassQueue::CountTried.

@@ -289,6 +289,8 @@ void TCimXmlReader::BeginProperty(const TCimXmlAttributes& attributes)
         fDraft.BeginProperty(name, attributes);
     }
     const TType type = ReadPropertyType(attributes);
+    // In a draft, unmarked text stays text: the class that could declare it an object is not known yet (see
+    // TCimXmlInstanceBuilder::Fill).
     TCimXmlItem::EText text = TCimXmlItem::kPlain;
     if (type.GetElementType() == TType::kString) {
         if (IsMarkedEmbedded(attributes)) {
@@ -387,6 +389,7 @@ void TCimXmlReader::FailUnexpected(const char* name) const
     const TOpen& open = fOpen.back();
     const std::string place = open.element == TElement::kUnknown ? " as the outermost element"
                                                                  : std::string(" in <") + TElement::GetName(open.element) + ">";
+    // Quote makes the name presentable; angle brackets take the place of its quotes.
     const std::string shown = Quote(name);
     fContext.Fail(EStatus::kParseError, "found element <" + shown.substr(1, shown.size() - 2) + ">" + place + ", expected " +
                                             TTable::DescribeExpected(open.state));

@@ -3,7 +3,7 @@
 //     letter, _, beyond ASCII      a name or a key word; the parser knows which
 //     digit, or sign or point      a number; everything that can belong to one is taken, and the parser finds out if it is one
 //     with a digit behind it
-//     ' or "                       a text up to the same quote; a backslash escapes quotes and backslashes, and is itself elsewhere
+//     ' or "                       a text up to the same quote; a backslash escapes quotes and backslashes only
 //     = <> != < <= > >= ( ) , . *  a symbol; the longest one counts
 //
 // Blanks, tabs and line breaks between tokens are ignored.

@@ -51,6 +51,7 @@ void TQueryMatcher::Bind(const TQueryCondition& condition)
     }
     for (const TQueryOperand& operand : condition.operands) {
         if (!operand.name.empty()) {
+            // A property that this class does not declare keeps kNoSlot and counts as NULL.
             fSlots.resize(std::max(fSlots.size(), operand.ordinal + 1), TInMemLayout::kNoSlot);
             fSlots[operand.ordinal] = fClass.GetLayout().FindSlot(operand.name);
         }
@@ -201,6 +202,7 @@ TQueryMatcher::ETruth TQueryMatcher::EvaluateIsA(const TQueryCondition& test, co
         const TCIMReference path = value;
         return IsA(path.GetClassName(), test.className) ? kTrue : kFalse;
     }
+    // Plain text is of no class.
     const auto object = value.GetEmbeddedObject();
     return object && IsA(object->GetClassName(), test.className) ? kTrue : kFalse;
 }

@@ -154,6 +154,7 @@ void TQueryParser::TakeList()
 
 TQueryParser::TPointer TQueryParser::ReadOr()
 {
+    // A single part is kept in its list too; that evaluates to the same.
     auto condition = std::make_unique<TQueryCondition>(TQueryCondition::kOr, fToken.position);
     do {
         condition->parts.push_back(ReadAnd());
@@ -236,6 +237,7 @@ TQueryParser::TPointer TQueryParser::ReadLike(TQueryOperand left)
         FailExpected("a pattern in quotes");
     }
     auto test = std::make_unique<TQueryCondition>(TQueryCondition::kLike, left.position);
+    // The pattern is a literal, so it is compiled once for all instances.
     test->pattern = std::make_unique<TLikePattern>(fToken.text);
     test->operands.push_back(std::move(left));
     Advance();
@@ -254,6 +256,7 @@ TQueryParser::TPointer TQueryParser::ReadIsNull(TQueryOperand left)
     if (!isNegated) {
         return test;
     }
+    // A NOT around the test spares a further kind of test.
     auto negation = std::make_unique<TQueryCondition>(TQueryCondition::kNot, position);
     negation->parts.push_back(std::move(test));
     return negation;

@@ -37,7 +37,7 @@ class CIMDELTA_EXPORT THashIndex {
     void Add(std::uint32_t hash, std::uint32_t ordinal);
     /// Does nothing if the pair is not there.
     void Remove(std::uint32_t hash, std::uint32_t ordinal) noexcept;
-    /// Makes room for `count` entries in all. Adding up to that number cannot fail then.
+    /// Makes room for `count` entries in all. Then adding up to that number cannot fail.
     void Reserve(std::size_t count);
     void Clear() noexcept;
     void Swap(THashIndex& other) noexcept;

@@ -38,6 +38,7 @@ TInMemClass::TInMemClass(const boost::shared_ptr<TInMemNamespace>& ns, const std
     : fName(name), fNamespaceName(ns->GetNamespaceName()), fSuper(std::move(superClass)), fNamespace(ns),
       fLayout(fSuper ? &fSuper->fLayout : nullptr), fMethods(fSuper ? &fSuper->fMethods : nullptr)
 {
+    // Layout, methods and qualifiers of the superclass are used in place; fSuper keeps them alive.
     InheritQualifiers(fSuper ? &fSuper->GetQualifiers() : nullptr);
 }
 
@@ -346,6 +347,7 @@ void TInMemClass::SetSpelling(const std::string& name)
     }
     // In place: the namespace looks the class up by a view of this text.
     std::copy(name.begin(), name.end(), fName.begin());
+    // References in keys show the name of the class, so indexed texts may be out of date.
     if (const auto ns = fNamespace.lock()) {
         ns->ReferenceTextsChanged();
     }

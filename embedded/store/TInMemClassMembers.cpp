@@ -51,6 +51,7 @@ std::vector<boost::shared_ptr<TInMemClass>> TInMemClass::GetReservedClassesBelow
 void TInMemClass::ChangeProperty(const TInMemPropertyDecl& decl, const boost::function<void()>& change)
 {
     const auto below = GetReservedClassesBelow();
+    // If this throws, nothing has happened except that memory was reserved.
     change();
     fLayout.Update(decl.GetName());
     for (const auto& cls : below) {

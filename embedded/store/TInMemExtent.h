@@ -46,7 +46,7 @@ class TInMemExtent {
     std::size_t GetCount() const noexcept { return fCount; }
 
     TMark GetMark() const noexcept;
-    /// Takes out what was added since; nothing may have been removed since.
+    /// Takes out what was added since the mark. Nothing may have been removed since.
     void RollBack(const TMark& mark) noexcept;
 
     /// Call this after the texts of references in keys have changed. The keys are indexed anew when the index is next needed, so

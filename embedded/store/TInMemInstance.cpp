@@ -107,7 +107,7 @@ TCIMReference TInMemInstance::GetReference() const
 {
     const auto ns = fClass->GetInMemNamespace();
     TCIMReference path(ns, std::map<std::string, TCIMValue>());
-    // The name still says where the instance was.
+    // The class keeps the name of its namespace, which completes the path.
     if (!ns) {
         path.SetNamespaceName(fClass->GetNamespaceName());
     }

@@ -40,7 +40,7 @@ void TInMemLayout::CatchUp()
     if (!fSuper || fSuper->fVersion == fSuperVersion) {
         return;
     }
-    // What is here may be gone above, and what is above may be new here.
+    // The superclass may have lost properties that are still here, and may have got new ones.
     for (std::uint32_t slot = 0; slot < GetSlotCount(); ++slot) {
         Resolve(fSlots[slot]->GetName());
     }

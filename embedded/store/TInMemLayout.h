@@ -51,7 +51,7 @@ class CIMDELTA_EXPORT TInMemLayout {
     /// Adds a declaration to this class. One of that name that is inherited is overridden by it and keeps its place. Call Reserve
     /// first. Errors: std::bad_alloc, and then nothing has changed.
     void AddOwn(const boost::shared_ptr<TInMemPropertyDecl>& decl);
-    /// Takes out one that the class itself declares. What it overrode counts again.
+    /// Takes out a declaration of the class itself. What it overrode counts again.
     void RemoveOwn(const boost::shared_ptr<TInMemPropertyDecl>& decl);
     /// Takes over a declaration that has been added above. One whose name is new here comes at `position` of the order.
     void TakeIn(const boost::shared_ptr<TInMemPropertyDecl>& decl, std::size_t position);

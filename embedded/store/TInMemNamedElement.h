@@ -33,8 +33,8 @@ class CIMDELTA_EXPORT TInMemNamedElement : public TInterface {
     void AddQualifier(boost::shared_ptr<ICIMQualifier> qualifier);
 
   protected:
-    /// Adds one that is not null; if it fails, nothing has changed. To be overridden by elements that derive something from their
-    /// qualifiers.
+    /// Adds a qualifier, which is not null. If it fails, nothing has changed. Elements that derive something from their qualifiers
+    /// override it.
     virtual void PutQualifier(boost::shared_ptr<ICIMQualifier> qualifier) { fQualifiers.Add(std::move(qualifier)); }
     void InheritQualifiers(const TInMemQualifierSet* parent) noexcept { fQualifiers.SetParent(parent); }
 

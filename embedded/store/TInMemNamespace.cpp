@@ -123,6 +123,7 @@ void TInMemNamespace::CheckDeclarable(const TInMemClass& cls) const
     if (!superClass->IsDeclared()) {
         throw TZELException(TZELStatusCode::kNotFound);
     }
+    // The superclass may have got one of these properties after the class was allocated.
     for (const auto& own : cls.GetLayout().GetOwnDecls()) {
         const auto inherited = superClass->FindPropertyDecl(own->GetName());
         if (inherited && inherited->GetType() != own->GetType()) {

@@ -79,7 +79,7 @@ class CIMDELTA_EXPORT TInMemNamespace final : public ICIMNamespace,
     const std::vector<boost::shared_ptr<TInMemQualifierDecl>>& GetQualifierDecls() const noexcept { return fQualifierDecls; }
     /// Errors: kAlreadyExists (12) if one of that name is declared.
     void AddQualifierDecl(boost::shared_ptr<TInMemQualifierDecl> decl);
-    /// Takes out one that AddQualifierDecl has added. Qualifiers made from it stay.
+    /// Takes out a declaration that AddQualifierDecl has added. Qualifiers made from it stay.
     void Withdraw(const TInMemQualifierDecl& decl) noexcept;
     /// The instance of that path; null if there is none or no such class. Errors: kTypeMismatch (13), kKeyMissing (14).
     boost::shared_ptr<TInMemInstance> FindInstance(const TCIMReference& path) const;

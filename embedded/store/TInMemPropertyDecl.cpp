@@ -24,6 +24,7 @@ TInMemPropertyDecl::TInMemPropertyDecl(const std::string& name, const TCIMValue&
     if (value.GetType() == TCIMValue::TCIMType::kReference && !value.IsNull()) {
         const TCIMReference path = value;
         fReferenceClass = path.GetClassName();
+        // Without keys the reference only names the class.
         if (path.GetKeyCount() == 0) {
             fDefault = TCIMValue::Null(value.GetType());
         }
@@ -98,6 +99,7 @@ void TInMemPropertyDecl::PutQualifier(boost::shared_ptr<ICIMQualifier> qualifier
         UpdateMarks();
     };
     const auto owner = GetOwner();
+    // Not in a class yet, so no layout depends on the marks.
     if (!owner) {
         put();
         return;

@@ -58,7 +58,7 @@ class CIMDELTA_EXPORT TInMemPropertyDecl : public TInMemNamedElement<ICIMPropert
     /// The declaration of an ancestor that this one overrides, from which it inherits qualifiers; null for none.
     const boost::shared_ptr<TInMemPropertyDecl>& GetOverridden() const noexcept { return fOverridden; }
     void SetOverridden(boost::shared_ptr<TInMemPropertyDecl> overridden);
-    /// Whether it would still be a key if `other`, this one or one that it overrides, did not say so.
+    /// Whether this declaration, or one that it overrides, has the qualifier Key(true) if `other` is left out of account.
     bool IsKeyWithout(const TInMemPropertyDecl& other) const;
 
     /// The class that declares it; null before it is added to one, and if that class is gone.

@@ -23,7 +23,7 @@ class CIMDELTA_EXPORT TInMemQualifierSet {
     /// Names the set to inherit from; null for none. It must outlive this one.
     void SetParent(const TInMemQualifierSet* parent) noexcept { fParent = parent; }
 
-    /// Adds one. An own one of that name is replaced. `qualifier` must not be null.
+    /// Adds a qualifier. An own qualifier of the same name is replaced. `qualifier` must not be null.
     void Add(boost::shared_ptr<ICIMQualifier> qualifier);
 
     /// The qualifier of that name, own or inherited, or null. Letter case does not count.
@@ -31,9 +31,9 @@ class CIMDELTA_EXPORT TInMemQualifierSet {
     /// Own ones in the order they were added, then inherited ones, until the callback returns false.
     void Enumerate(const boost::function<bool(boost::shared_ptr<ICIMQualifier>)>& callback) const;
 
-    /// The element's own ones, in the order they were added.
+    /// The element's own qualifiers, in the order in which they were added.
     const std::vector<boost::shared_ptr<ICIMQualifier>>& GetOwn() const noexcept { return fOwn; }
-    /// How many there are in this set and its ancestors, those that are not inherited included.
+    /// The number of qualifiers in this set and its ancestors, including those that are not inherited.
     std::size_t CountAll() const noexcept;
     /// Whether there is one of that name, own or inherited, with the value TRUE.
     bool IsTrue(std::string_view name) const;

@@ -24,7 +24,7 @@ class CIMDELTA_INTERNAL_EXPORT TInMemStaging {
     TInMemStaging& operator=(const TInMemStaging&) = delete;
     ~TInMemStaging();
 
-    /// The staging may go on after an error of the following three; what failed is not added.
+    /// After an error of the following three operations the staging may still be used; what failed is not added.
     /// Errors: kAlreadyExists (12) if one of that name is declared.
     void AddQualifierDecl(const boost::shared_ptr<TInMemQualifierDecl>& decl);
     /// Adds a class allocated from the namespace. Errors: kAlreadyExists (12), kTypeMismatch (13), kNotFound (15) if its superclass

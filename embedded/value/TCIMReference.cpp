@@ -67,6 +67,7 @@ TCIMReference::TCIMReference(const TCIMReference& other) noexcept : fContents(ot
 
 TCIMReference& TCIMReference::operator=(const TCIMReference& other) noexcept
 {
+    // Acquires before it releases, so a path may be assigned to itself.
     TCIMReference copy(other);
     std::swap(fContents, copy.fContents);
     return *this;

@@ -181,6 +181,7 @@ TCIMValue TCIMValue::FromText(std::string_view text)
         TAccess::StoreText(value, text);
         return value;
     }
+    // The one step that may fail comes first. The value takes over the one use that the new block has.
     const TCounted* const block = TSharedText::CreateRaw(text);
     TCIMValue value(TCIMType::kString, TAccess::kSharedText);
     TAccess::Store(value, block);
@@ -326,6 +327,7 @@ std::string TCIMValue::ToText() const
     return text;
 }
 
+/// Different keys must have different texts, so text is quoted and escaped here, unlike in ToText.
 void TCIMValue::AppendKeyText(std::string& out) const
 {
     switch (fForm) {

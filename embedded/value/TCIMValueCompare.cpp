@@ -1,6 +1,6 @@
 // Equality and hash of values.
 //
-// Nulls are equal, whatever their types. Other values of different types are different, even if their numbers are equal. Values of
+// Nulls of any types are equal. Other values of different types are different, even if their numbers are equal. Values of
 // the same type are compared by what they mean: -0 equals 0, every NaN equals every other, datetimes are equal if their instants
 // are. Equal values have the same hash.
 //

@@ -1,3 +1,6 @@
+// The bytes of a value (TCIMValue.cpp draws their layout). Everything here relies on the form, which the caller has checked, and
+// nothing throws: a caller makes a block before it stores the pointer.
+
 #include "embedded/value/TValueAccess.h"
 
 #include <new>
@@ -63,7 +66,7 @@ void TValueAccess::StoreText(TCIMValue& value, std::string_view text) noexcept
 
 void TValueAccess::StoreDateTime(TCIMValue& value, const TCIMDateTime& time) noexcept
 {
-    // TCIMValue.cpp draws the layout. The last arguments are positions in fBytes.
+    // The last arguments are positions in fBytes.
     Store(value, time.fMicroseconds);
     Store(value, time.fOffset, 0);
     Store(value, time.fUnknown, 2);

@@ -32,7 +32,7 @@ constexpr std::string_view kBlanks = " \t\r\n";
 constexpr const char* kTypeNames[] = {"",       "boolean", "uint8",  "sint8",  "uint16", "sint16", "uint32",   "sint32",
                                       "uint64", "sint64",  "real32", "real64", "char16", "string", "datetime", "reference"};
 
-/// Reads a number that must end where the digits end.
+/// Reads a number that must fill the whole text.
 template <class T>
 bool ReadAll(std::string_view digits, T& number, int base)
 {
@@ -275,7 +275,7 @@ void TValueText::AppendReal(std::string& out, double number, bool isReal32)
         out += number < 0 ? "-INF" : "INF";
         return;
     }
-    char digits[32];
+    char digits[32];  // the longest is -1.7976931348623157e+308
     char* const end = digits + sizeof digits;
     out.append(digits,
                isReal32 ? std::to_chars(digits, end, static_cast<float>(number)).ptr : std::to_chars(digits, end, number).ptr);

@@ -1,3 +1,9 @@
+// Conversions for values whose type is not the declared one: keys of a path that was read from text, and properties that a document
+// writes with another type.
+//
+// A number is converted only if the new type holds exactly the same number; nothing is rounded or cut off. Text is read as Parse
+// reads it, and char16, datetimes and references become text. There is no other conversion.
+
 #include <cmath>
 #include <limits>
 

@@ -251,6 +251,7 @@ void TValueXml::AppendValue(std::string& out, const TCIMValue& value)
 
 void TValueXml::AppendReference(std::string& out, const TCIMReference& path)
 {
+    // With a namespace the element is one of four: for a class or an instance, with or without a host.
     const bool isClass = path.GetKeyCount() == 0;
     const char* element = nullptr;
     if (!path.GetNamespaceName().empty()) {

@@ -1,6 +1,6 @@
 // Escaping for CIM-XML. Text comes in runs of plain ASCII, which are appended as a whole; between them, one character at a time is
-// copied, escaped, or replaced by U+FFFD if XML 1.0 does not allow it. The result can always be parsed, whatever bytes a value
-// holds.
+// copied, escaped, or replaced by U+FFFD if XML 1.0 does not allow it. The result can always be parsed, even if a value holds
+// arbitrary bytes.
 
 #include "embedded/value/TUtf8.h"
 #include "embedded/value/TValueXml.h"
