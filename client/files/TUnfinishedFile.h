@@ -22,7 +22,7 @@ class TUnfinishedFile {
     /// Open for writing until Close.
     int GetDescriptor() const { return fDescriptor; }
 
-    /// Closes the descriptor, if it is still open. Errors: std::system_error; it is closed all the same.
+    /// Closes the descriptor, if it is still open. Errors: std::system_error; the descriptor is closed even then.
     void Close();
 
     /// Gives the file its final name in place of what has that name. Errors: std::system_error; the file is still unfinished.

@@ -6,7 +6,7 @@ namespace NORVZEL20 {
 
 /// Blocks the signals of EndingSignals() in the calling thread while this object lives; they are delivered afterwards.
 ///
-/// A thread that is started meanwhile keeps them blocked for good. Helper threads are started this way. Then signals arrive in
+/// A thread that is started meanwhile keeps them blocked until it ends. Helper threads are started this way. Then signals arrive in
 /// the main thread, and TUnfinishedFile can hold them back there.
 class TSignalsHeld {
   public:

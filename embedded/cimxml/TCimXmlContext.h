@@ -68,8 +68,9 @@ class CIMDELTA_INTERNAL_EXPORT TCimXmlContext {
     TLoadReport& GetReport() noexcept { return fReport; }
     TTextPool& GetTexts() noexcept { return fTexts; }
 
-    /// Brackets the reading of an embedded object, whose errors say so. Errors: fails with kParseError (9) if objects are nested
-    /// too deeply. An error ends the load, so code that throws need not call LeaveEmbeddedObject.
+    /// Call these two around the reading of an embedded object; messages then mention that they are about one. Errors: fails with
+    /// kParseError (9) if objects are nested too deeply. An error ends the load, so code that throws need not call
+    /// LeaveEmbeddedObject.
     void EnterEmbeddedObject();
     void LeaveEmbeddedObject() noexcept { --fEmbeddedDepth; }
 

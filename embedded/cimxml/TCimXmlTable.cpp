@@ -1,6 +1,6 @@
 // The grammar of CIM-XML as a table.
 //
-// A row says: in this state, this element may start; the next state is so and so; do this action. The next state belongs to the
+// A row says: in this state, this element may start; then go to that state and do that action. The next state belongs to the
 // element that has started, and it ends with that element. For example, reading
 //
 //     <INSTANCE CLASSNAME="Disk"><PROPERTY NAME="Id" TYPE="uint32"><VALUE>5</VALUE></PROPERTY></INSTANCE>

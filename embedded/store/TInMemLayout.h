@@ -43,8 +43,8 @@ class CIMDELTA_EXPORT TInMemLayout {
     /// The declaration that counts for this class, its own or an inherited one; null if there is none.
     boost::shared_ptr<TInMemPropertyDecl> FindDecl(std::string_view name) const;
 
-    /// Takes over what has changed in the superclass since the last time; for a class that was not declared meanwhile. Errors:
-    /// std::bad_alloc.
+    /// Takes over what has changed in the superclass since the last time. A class that is not declared is not kept up to date and
+    /// needs this when it is declared. Errors: std::bad_alloc.
     void CatchUp();
     /// Makes room for one more property, which may be a key.
     void Reserve();

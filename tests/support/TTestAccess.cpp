@@ -1,7 +1,7 @@
 #include "tests/support/TTestAccess.h"
 
-// TDeltaNamespace is an installed type, which names no friend. The arguments of an explicit instantiation may name private members
-// all the same, so each instantiation below gives one of them to a function that only this file has.
+// TDeltaNamespace is an installed type, which names no friend. But the arguments of an explicit instantiation may name private
+// members, so each instantiation below gives one of them to a function that only this file has.
 
 namespace NORVZEL20 {
 

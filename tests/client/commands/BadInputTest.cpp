@@ -3,6 +3,7 @@
 namespace NORVZEL20 {
 namespace {
 
+/// Input that cannot be used: one message that names the place and what to do, exit status 2 and no result.
 class BadInputTest : public TClientFixture {};
 
 TEST_F(BadInputTest, EachUnusableRulesFileGetsOneMessage)

@@ -3,6 +3,8 @@
 namespace NORVZEL20 {
 namespace {
 
+/// `compare` from the arguments to the report, over the small inventories of tests/client/data. Reports are compared as whole
+/// texts.
 class CompareTest : public TClientFixture {
   protected:
     /// The inventory without its last instance.

@@ -5,6 +5,7 @@
 namespace NORVZEL20 {
 namespace {
 
+/// `check` and `explain`, with rules for the inventories in tests/client/data.
 class RulesCommandsTest : public TClientFixture {};
 
 TEST_F(RulesCommandsTest, CheckShowsElementsAndEffectiveRules)

@@ -5,6 +5,7 @@
 namespace NORVZEL20 {
 namespace {
 
+/// The formats for programs. Their texts are part of the contract, so they are compared letter by letter.
 class FormatsTest : public TClientFixture {};
 
 TEST_F(FormatsTest, NdjsonHasADocumentForEachDifferenceAndOneForTheCoverage)
