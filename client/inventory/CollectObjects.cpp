@@ -13,8 +13,8 @@ std::vector<boost::shared_ptr<ICIMClass>> SubclassesOf(ICIMClass& cls)
 
 std::vector<boost::shared_ptr<ICIMClass>> AllClassesOf(ICIMNamespace& ns)
 {
-    // A stack of its own, because an inventory may declare a tree that is taller than the process's stack allows. It holds the
-    // classes still to visit, the next one last.
+    // A list instead of recursion: a tall tree then takes memory and not the stack of the process. It holds the classes still to
+    // visit, the next one last.
     std::vector<boost::shared_ptr<ICIMClass>> open = SubclassesOf(*ns.GetClass(kRootClassName, TCallContext()));
     std::reverse(open.begin(), open.end());
     std::vector<boost::shared_ptr<ICIMClass>> classes;

@@ -28,7 +28,7 @@ namespace NORVZEL20 {
 
 namespace {
 
-// As many as Linux follows in one path.
+// Linux follows as many links in one path.
 const int kMostLinks = 40;
 
 // The folder of a path, with the slash behind it; empty for the current one.

@@ -1,4 +1,4 @@
-// Names and values come from files that anybody may have written, and are shown on a terminal. There an escape sequence can move
+// Names and values come from files of unknown origin and are shown on a terminal. There an escape sequence can move
 // the cursor or rename the window, a line end can fake a line of the report, and a mark of direction can make a name read as
 // another one. So text is decoded as UTF-8, character by character, and everything that is not plainly visible is replaced:
 //

@@ -39,8 +39,8 @@ class TCimXmlInstanceBuilder {
     /// `metUnknownClass` says that the value refers to a class that is not declared yet. A value of another type is converted.
     /// Errors: kTypeMismatch (13) if that would lose something.
     void SetProperty(const TCimXmlTarget& target, TCIMValue&& value, bool metUnknownClass);
-    /// Begins the instance and sets all its properties; for drafts whose document has ended. Errors: kNotFound (15) if its class is
-    /// not declared; those of FindProperty and SetProperty.
+    /// Begins the instance and sets all its properties. Call it for a draft when the document has ended. Errors: kNotFound (15) if
+    /// its class is not declared; those of FindProperty and SetProperty.
     void Fill(const TCimXmlDraft& draft, const TReadObjects& readObjects);
     /// Ends the instance. `ownKeys` (may be null) are the keys of the name in front of it, for those that it leaves out.
     boost::shared_ptr<TInMemInstance> Take(const TOwnKeys* ownKeys);

@@ -1,8 +1,9 @@
 // Classes and properties, copied out of a namespace.
 //
 // A class of this host knows which properties, methods and qualifiers are its own and which it inherits. The interfaces of the host
-// do not show that difference, nor parameters, array sizes and classes of references. So the functions below look whether an object
-// is one of this host (`inMemory` is not null) and then ask it directly; for any other they copy what the interfaces show.
+// do not show that difference; they do not show parameters, array sizes and classes of references either. So the functions below
+// check whether an object is one of this host (`inMemory` is not null). If so, they ask it directly; otherwise they copy what the
+// interfaces show.
 #include "embedded/cimxml/TCimXmlObjects.h"
 
 #include <type_traits>

@@ -27,7 +27,7 @@ class CIMDELTA_INTERNAL_EXPORT TLikePattern {
         std::vector<std::pair<char32_t, char32_t>> ranges;  ///< first and last of each
     };
 
-    /// For a step that takes one character.
+    /// Whether the step, which must take one character, takes this one.
     static bool Fits(const TStep& step, char32_t character);
     std::size_t ReadSet(const std::vector<char32_t>& pattern, std::size_t at);
 

@@ -47,7 +47,7 @@ class CIMDELTA_EXPORT TInMemInstance final : public ICIMInstance, public boost::
     TInMemProperty* FindProperty(std::string_view name) const;
     /// The property in a slot of the class (see TInMemLayout::FindSlot).
     TInMemProperty& GetSlotProperty(std::uint32_t slot) const;
-    /// The value in a slot; a static property's too.
+    /// The value in a slot, also that of a static property.
     const TCIMValue& GetSlotValue(std::uint32_t slot) const;
     /// Sets the property in a slot as ICIMProperty::SetValue does, without looking up a name. Errors: kTypeMismatch (13).
     void SetSlot(std::uint32_t slot, TCIMValue value);

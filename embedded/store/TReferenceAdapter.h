@@ -11,8 +11,8 @@ namespace NORVZEL20 {
 
 /// Brings references in line with the classes of a namespace: with the class itself, keys spelled and typed as declared.
 ///
-/// Meant for references that were made before their class was declared, or before a name was spelled another way. References within
-/// keys, arrays and embedded objects are adapted too.
+/// It is meant for references that were made before their class was declared, or before a name was spelled another way. References
+/// within keys, arrays and embedded objects are adapted too.
 class CIMDELTA_INTERNAL_EXPORT TReferenceAdapter {
   public:
     /// `ns` must outlive this.

@@ -4,7 +4,7 @@
 
 namespace NORVZEL20 {
 
-/// The bounds for classes that come from a document: no document makes the program use too much memory or time. They are many times
+/// The bounds for classes that come from a document. They keep a document from taking too much memory or time. They are many times
 /// what any published schema has. Counts include what is inherited.
 struct TSchemaLimits {
     static constexpr std::size_t kMaxSuperClasses = 1000;  ///< of a class; so a class tree may be walked by recursion

@@ -4,7 +4,7 @@
 //     binding  = key "=" value
 //     value    = `"` text `"` | "'" character "'" | number | "TRUE" | "FALSE" | "NULL"
 //
-// In quotes a backslash makes the next character part of the text, whichever it is. A value without quotes ends at the next comma.
+// In quotes a backslash makes the next character part of the text, even a quote. A value without quotes ends at the next comma.
 // The namespace ends at the first colon; if an equals sign or a quote comes before it, the colon belongs to a value and there is
 // no namespace. A path without a class must have bindings, and no key may occur twice. "=@" marks the one instance of a class
 // without keys.

@@ -12,7 +12,7 @@ const char kTwice[] = "<CIM CIMVERSION='2.0' DTDVERSION='2.0'><DECLARATION><DECL
 /// More inventories than are loaded at a time.
 class ManyInventoriesTest : public TProgramFixture {
   protected:
-    /// That many copies of an inventory, the one at `at` another one.
+    /// The same inventory kMany times, but `other` at position `at`.
     static std::vector<std::string> Inventories(const std::string& inventory, int at, const std::string& other)
     {
         std::vector<std::string> inventories(kMany, inventory);

@@ -8,7 +8,7 @@
 
 namespace NORVZEL20 {
 
-/// Records the calls on a set of watched objects, one line each, in order. Can make calls fail.
+/// Records the calls on a set of watched objects, one line each, in order. It can make calls fail.
 ///
 /// A line has object, operation, arguments and context: `ns0:Disk.EnumerateInstances(false) {}`. Calls that the host itself makes
 /// on a watched object (a path asks its class for the name) are not recorded and never fail.
