@@ -23,6 +23,7 @@ void TCIMDiffEngine::TDiffXMLParser::TStateClass::StartElement(TDiffXMLParser& p
 
 void TCIMDiffEngine::TDiffXMLParser::TStateClass::EndElement(TDiffXMLParser& parser, std::string& name)
 {
+    // The class first, because its subclasses get the rules that result from this merge.
     parser.fRuleset.addToRuleset(fClassName, parser.fCurrentRules, true);
     parser.fRuleset.updateRuleset(fClassName, "", parser.fSchema);
     TParseState::EndElement(parser, name);
@@ -35,6 +36,7 @@ void TCIMDiffEngine::TDiffXMLParser::TStateClass::HandleAttrs(TDiffXMLParser& pa
     for (const auto& [name, value] : attrs) {
         HandleAttr(parser, name, value);
     }
+    // Checked after all attributes, because a wrong attribute is reported before a missing name.
     if (fClassName.empty()) {
         FailOnLine(parser, "Class specified on line ", "has no name");
     }

@@ -13,6 +13,7 @@ const char kAdvice[] = "; TMPDIR names the folder";
 
 std::string Begin()
 {
+    // An empty TMPDIR counts as none.
     const char* folder = getenv("TMPDIR");
     return std::string(folder == nullptr || *folder == '\0' ? "/tmp" : folder) + "/cimdelta-";
 }

@@ -33,6 +33,7 @@ std::string ShortName(const std::string& path)
         return "stdin";
     }
     std::string name = path.substr(path.rfind('/') + 1);
+    // The suffix of the compression comes last in the name, so it is taken off first.
     TakeOffOneOf(name, {".gz", ".xz", ".zst"});
     TakeOffOneOf(name, {".xml", ".cimxml", ".cim"});
     return name.empty() ? path : name;

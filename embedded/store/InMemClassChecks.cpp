@@ -7,6 +7,7 @@ namespace NORVZEL20 {
 
 namespace {
 
+/// The layout has inherited properties too, so this covers all ancestors.
 void CheckTypeFitsHere(const TInMemLayout& layout, const TInMemPropertyDecl& decl)
 {
     const std::uint32_t slot = layout.FindSlot(decl.GetName());
@@ -15,6 +16,7 @@ void CheckTypeFitsHere(const TInMemLayout& layout, const TInMemPropertyDecl& dec
     }
 }
 
+/// Without instances a class may lose a key. Otherwise another declaration of the property must still make it one.
 void CheckKeyStaysHere(const TInMemClass& cls, const TInMemPropertyDecl& decl)
 {
     const auto present = cls.FindPropertyDecl(decl.GetName());
@@ -34,7 +36,7 @@ void RequireSame(TCIMValue::TCIMType a, TCIMValue::TCIMType b)
 
 void CheckTypeFits(const TInMemClass& cls, const TInMemPropertyDecl& decl)
 {
-    CheckTypeFitsHere(cls.GetLayout(), decl);  // has what ancestors declare, too
+    CheckTypeFitsHere(cls.GetLayout(), decl);
     for (const auto& below : cls.GetClassesBelow()) {
         CheckTypeFitsHere(below->GetLayout(), decl);
     }

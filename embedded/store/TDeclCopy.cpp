@@ -16,6 +16,7 @@ void CopyQualifiers(const ICIMNamedElement& source, ICIMNamedElement& copy)
         TCallContext());
 }
 
+/// Parameters are not part of the host's interfaces, so their source is always of this host.
 boost::shared_ptr<TInMemParameter> CopyParameter(const TInMemParameter& source)
 {
     auto copy = boost::make_shared<TInMemParameter>(source.GetName(), source.GetType());

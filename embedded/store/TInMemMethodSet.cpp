@@ -28,6 +28,7 @@ std::vector<boost::shared_ptr<TInMemMethodDecl>> TInMemMethodSet::GetAll() const
     std::vector<boost::shared_ptr<TInMemMethodDecl>> methods;
     for (auto set = lineage.rbegin(); set != lineage.rend(); ++set) {
         for (const auto& method : (*set)->fOwn) {
+            // A method that overrides another one is listed in the place of the first.
             if (!method->GetOverridden()) {
                 methods.push_back(Find(method->GetName()));
             }

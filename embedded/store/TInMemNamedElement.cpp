@@ -35,6 +35,7 @@ boost::shared_ptr<ICIMQualifier>
 TInMemNamedElement<TInterface>::AllocateQualifier(boost::shared_ptr<const ICIMQualifierDecl> decl, const TCIMValue& value,
                                                   ICIMQualifierDecl::EFlavor flavor, TCallContext context) const
 {
+    // A null takes the declared type; any other value must have it.
     const TCIMValue::TCIMType type = decl->GetValue(context).GetType();
     if (!value.IsNull() && value.GetType() != type) {
         throw TZELException(TZELStatusCode::kTypeMismatch);

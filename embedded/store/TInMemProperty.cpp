@@ -40,12 +40,14 @@ void TInMemProperty::MarkChanged(const TCIMValue& value)
     Change(TCIMValue(value), true);
 }
 
-/// Sets the value, after what may fail: to check the new value, and to keep the old one if it will be asked for.
+/// Everything that may fail comes first: checking the new value, and keeping the old one if it will be asked for. Then the value
+/// is set.
 void TInMemProperty::Change(TCIMValue&& value, bool isMarked)
 {
     TInMemInstance& instance = GetInstance();
     const TInMemPropertyDecl& decl = instance.GetInMemClass()->GetLayout().GetDecl(fSlot);
     TCIMValue fitting = decl.Fit(std::move(value));
+    // The index of the extent finds the instance by the key that it was added with.
     if (instance.IsAdded() && decl.IsKey()) {
         instance.KeepKey(fSlot, fValue);
     }
@@ -56,6 +58,7 @@ void TInMemProperty::Change(TCIMValue&& value, bool isMarked)
     fValue = std::move(fitting);
 }
 
+/// Keeps nothing, unlike Change: the value still means the same.
 void TInMemProperty::Rewrite(TCIMValue value)
 {
     fValue = GetInstance().GetInMemClass()->GetLayout().GetDecl(fSlot).Fit(std::move(value));
