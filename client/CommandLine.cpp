@@ -109,7 +109,7 @@ class TCommandLine {
     CLI::App* AddCommand(const char* name, const char* description, std::function<int(IConsole&)> run)
     {
         CLI::App* command = fApp.add_subcommand(name, description);
-        // Only noted: it runs when the whole command line has been accepted.
+        // The callback only notes the function, which runs when the whole command line has been accepted.
         command->callback([this, run] { fCommand = run; });
         return command;
     }

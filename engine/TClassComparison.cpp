@@ -125,7 +125,7 @@ void TCIMDiffEngine::TClassComparison::NoteAbsentInstances(std::size_t index)
         if (master.found == 0) {
             fAbsent[key].push_back(static_cast<int>(index));
         }
-        // Ready for the next namespace.
+        // The next namespace starts with no instance found.
         master.found = 0;
     }
 }

@@ -85,7 +85,8 @@ void TDeltaClass::EnumerateSubClasses(const boost::function<bool(boost::shared_p
 bool TDeltaClass::IsSubclassOf(boost::shared_ptr<const ICIMClass> cls, TCallContext context) const
 {
     const boost::shared_ptr<const TDeltaClass> wrapper = boost::dynamic_pointer_cast<const TDeltaClass>(cls);
-    // The wrapped class must be compared with another wrapped class, so `cls` is unwrapped; null if it is no wrapper.
+    // The wrapped class knows only classes of its own host, so `cls` is unwrapped. If `cls` is no wrapper, the null pointer fails
+    // the host's assertion.
     return fClass->IsSubclassOf(wrapper->fClass, context);
 }
 

@@ -134,7 +134,7 @@ boost::shared_ptr<ICIMClass> TDeltaNamespace::GetWrappedClass(const std::string&
     }
     const boost::shared_ptr<ICIMClass> cls = fCompareList[index]->GetClass(name, context);
     const boost::shared_ptr<TDeltaClass> wrapper(new TDeltaClass(shared_from_this(), cls));
-    // Entered last: if anything above fails, the cache is as it was.
+    // This comes last: if anything above fails, the cache is as it was.
     fClassCache[index].emplace(name, wrapper);
     return wrapper;
 }

@@ -31,7 +31,7 @@ bool TCoverage::IsWholeClass(const TClass& cls, bool timesCount) const
                                         [](const TSchemaNote& note) { return note.kind == TSchemaNote::kOperatingSystemMade; });
         return static_cast<std::size_t>(made) == cls.instances.size();
     }
-    // Of a compared class nothing may be left out, except the time of collection if times do not count.
+    // Nothing of a compared class may be left out, except the time of collection if times do not count.
     return cls.state == kCompared && std::all_of(cls.leftOut.begin(), cls.leftOut.end(), [timesCount](const std::string& name) {
                return !timesCount && name == kCollectionTime;
            });

@@ -75,7 +75,7 @@ void TCimXmlClassMaker::AddProperty(TInMemClass& cls, const TEmbeddedObject::TPr
                                                   ", but a superclass declares it as " +
                                                   TValueText::DescribeType(inherited->GetType()));
     }
-    // A repetition of what the class inherits anyway. The type was compared above.
+    // The document repeats what the class inherits anyway. The type was compared above.
     if (inherited && property.propagated) {
         return;
     }

@@ -50,7 +50,7 @@ class TXmlParser::TEvents : public TXmlReader::ISink {
         if (fLength == 0) {
             return;
         }
-        // Forgotten before the call: a handler that asks for the text again must not get it twice.
+        // The text is forgotten before the call: a handler that asks for it again must not get it twice.
         const std::size_t length = fLength;
         fLength = 0;
         fParser.characters(fText, static_cast<unsigned int>(length));

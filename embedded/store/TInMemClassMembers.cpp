@@ -252,7 +252,7 @@ bool TInMemClass::AddAssociationClass(boost::shared_ptr<ICIMClass> cls)
     if (IsAssociatedBy(*association)) {
         return false;
     }
-    // Held weakly, because two classes may name each other.
+    // The list holds classes weakly, because two classes may name each other.
     fAssociations.push_back(association);
     return true;
 }

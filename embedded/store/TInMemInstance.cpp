@@ -153,7 +153,7 @@ void TInMemInstance::EnumerateProperties(const boost::function<bool(boost::share
 {
     const auto self = shared_from_this();
     const std::vector<std::uint32_t>& order = fClass->GetLayout().GetOrder();
-    // By position, because the callback may add properties to the class.
+    // The loop goes by position, because the callback may add properties to the class.
     for (std::size_t at = 0; at < order.size(); ++at) {
         if (!callback(GetHandle(order[at], self))) {
             return;

@@ -58,7 +58,7 @@ void TInMemProperty::Change(TCIMValue&& value, bool isMarked)
     fValue = std::move(fitting);
 }
 
-/// Keeps nothing, unlike Change: the value still means the same.
+/// Unlike Change this keeps no earlier value and no key, because the value still means the same.
 void TInMemProperty::Rewrite(TCIMValue value)
 {
     fValue = GetInstance().GetInMemClass()->GetLayout().GetDecl(fSlot).Fit(std::move(value));

@@ -99,7 +99,7 @@ void TInMemPropertyDecl::PutQualifier(boost::shared_ptr<ICIMQualifier> qualifier
         UpdateMarks();
     };
     const auto owner = GetOwner();
-    // Not in a class yet, so no layout depends on the marks.
+    // The declaration is not in a class yet, so no layout depends on the marks.
     if (!owner) {
         put();
         return;
