@@ -78,6 +78,7 @@ void TInMemClass::Enter(TInMemClass& parent, TInMemExtent& extent)
 
 void TInMemClass::Leave(TInMemClass& parent) noexcept
 {
+    // The search begins at the end, because undoing a load removes the classes that came last.
     EraseLast(parent.fSubClasses, [this](const boost::weak_ptr<TInMemClass>& weak) { return weak.lock().get() == this; });
     fExtent = nullptr;
 }

@@ -22,6 +22,7 @@ TInMemNamespace::TInMemNamespace(const std::string& name) : fName(Trim(name, "/"
 boost::shared_ptr<TInMemNamespace> TInMemNamespace::Create(const std::string& name)
 {
     const boost::shared_ptr<TInMemNamespace> ns(new TInMemNamespace(name));
+    // It is never declared, so it has no extent.
     ns->fRoot = TInMemClass::Create(ns, kRootClassName, nullptr);
     return ns;
 }
@@ -91,6 +92,7 @@ boost::shared_ptr<TInMemClass> TInMemNamespace::FindClass(std::string_view name)
 
 boost::shared_ptr<ICIMClass> TInMemNamespace::GetClass(const std::string& name, TCallContext)
 {
+    // The pseudo-class is not in the table, so nothing enumerates it as a class.
     auto cls = name == kRootClassName ? fRoot : FindClass(name);
     if (!cls) {
         throw TZELException(TZELStatusCode::kNotFound);

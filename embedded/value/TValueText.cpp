@@ -158,6 +158,7 @@ bool TValueText::Parse(TCIMValue::TCIMType type, std::string_view text, TCIMValu
 {
     switch (type) {
     case TType::kString:
+        // White space is part of strings and of char16, so only the other types are trimmed.
         result = TCIMValue::FromText(text);
         return true;
     case TType::kChar16:
