@@ -82,9 +82,10 @@ TSystem ReadStandardInstance(TInMemNamespace& ns)
 boost::shared_ptr<const ICIMQualifierDecl> RequireKeyQualifier(TInMemNamespace& ns)
 {
     if (!ns.FindQualifierDecl(kKeyQualifier)) {
-        ns.AllocateQualifierDecl(kKeyQualifier, TCIMValue(false),
-                                 ICIMQualifierDecl::EScope(ICIMQualifierDecl::kScopeProperty | ICIMQualifierDecl::kScopeReference),
-                                 ICIMQualifierDecl::kFlavorToSubclass, TCallContext());
+        ns.AllocateQualifierDecl(
+            kKeyQualifier, TCIMValue(false),
+            static_cast<ICIMQualifierDecl::EScope>(ICIMQualifierDecl::kScopeProperty | ICIMQualifierDecl::kScopeReference),
+            ICIMQualifierDecl::kFlavorToSubclass, TCallContext());
     }
     return ns.FindQualifierDecl(kKeyQualifier);
 }

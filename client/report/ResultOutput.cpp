@@ -57,7 +57,7 @@ std::optional<int> DescriptorNamed(const std::string& path)
     if (folder.empty() || RealPath(FolderOf(path)) != folder) {
         return std::nullopt;
     }
-    return NumberOf(std::string_view(path).substr(FolderOf(path).size()));
+    return NumberOf(std::string_view{path}.substr(FolderOf(path).size()));
 }
 
 // The end of a path.
