@@ -19,6 +19,27 @@
 
 namespace NORVZEL20 {
 
+namespace {
+
+// Excluded keys reach the classes below with the first rules that those get, so a key that only a class below has is not a mistake.
+bool HasKeyThereOrBelow(const boost::shared_ptr<ICIMClass>& cls, const std::string& key)
+{
+    std::vector<boost::shared_ptr<ICIMClass>> open{cls};
+    while (!open.empty()) {
+        const boost::shared_ptr<ICIMClass> next = open.back();
+        open.pop_back();
+        const std::vector<std::string> keys = KeyNamesOf(*next);
+        if (std::find(keys.begin(), keys.end(), key) != keys.end()) {
+            return true;
+        }
+        const std::vector<boost::shared_ptr<ICIMClass>> below = SubclassesOf(*next);
+        open.insert(open.end(), below.begin(), below.end());
+    }
+    return false;
+}
+
+}  // namespace
+
 TRuleTrace::TRuleTrace(const TRulesDocument& document, boost::shared_ptr<ICIMNamespace> schema)
     : fElements(document.elements), fSchema(schema), fMarks(document.elements, schema)
 {
@@ -136,15 +157,14 @@ void TRuleTrace::CheckNames(std::size_t index)
                      " is already listed in this element; the first listing counts");
         }
     }
-    CheckKeys(index, *cls);
+    CheckKeys(index, cls);
 }
 
-void TRuleTrace::CheckKeys(std::size_t index, ICIMClass& cls)
+void TRuleTrace::CheckKeys(std::size_t index, const boost::shared_ptr<ICIMClass>& cls)
 {
     const TRulesDocument::TElement& element = fElements[index];
-    const std::vector<std::string> keys = KeyNamesOf(cls);
     for (const std::string& key : element.excludedKeys) {
-        if (std::find(keys.begin(), keys.end(), key) == keys.end()) {
+        if (!HasKeyThereOrBelow(cls, key)) {
             Warn(index, element.line, "excluded key " + key + " is not a key of class " + element.className);
         }
     }

@@ -55,7 +55,7 @@ class TRuleTrace {
     void WarnOfLateness(std::size_t index);
     void WarnOfOverruled(std::size_t index);
     void CheckNames(std::size_t index);
-    void CheckKeys(std::size_t index, ICIMClass& cls);
+    void CheckKeys(std::size_t index, const boost::shared_ptr<ICIMClass>& cls);
     void Warn(std::size_t index, unsigned int line, const std::string& text);
 
     TDecision MakeDefault(std::size_t index) const;

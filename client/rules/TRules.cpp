@@ -23,7 +23,8 @@ namespace {
 
 const std::size_t kBlockSize = 64 * 1024;
 
-void CheckFile(const std::string& file)
+// Returns the size in bytes.
+std::size_t CheckFile(const std::string& file)
 {
     struct stat status;
     // With the marker in the name, the plug-in would compare without rules.
@@ -41,14 +42,17 @@ void CheckFile(const std::string& file)
         throw TClientError(file + ": is larger than " + std::to_string(kMaxSpecFileSize) +
                            " bytes, the most that a rules file may have");
     }
+    return static_cast<std::size_t>(status.st_size);
 }
 
-std::string ReadWhole(const std::string& path)
+// Reads as many bytes as the file is said to have, because the plug-in does so too. A file of /proc has some although it is said to
+// have none; read further, it could be accepted here and refused there.
+std::string ReadText(const std::string& path, std::size_t size)
 {
     TInputFile file(path == "-" ? "./-" : path);  // "-" is a file here, not standard input
     std::string text;
     std::vector<char> block(kBlockSize);
-    while (const std::size_t count = file.Read(block.data(), block.size())) {
+    while (const std::size_t count = file.Read(block.data(), std::min(block.size(), size - text.size()))) {
         text.append(block.data(), count);
     }
     return text;
@@ -60,8 +64,7 @@ TRules::TRules(boost::shared_ptr<ICIMNamespace> schema, const std::string& file,
     // With a single namespace the engine neither checks operating systems nor reads a file; it only answers questions.
     : fSchemas(1, schema), fEngine(boost::shared_ptr<ICIMNamespace>(), fSchemas, std::string())
 {
-    CheckFile(file);
-    std::string text = ReadWhole(file);
+    std::string text = ReadText(file, CheckFile(file));
     TRulesParser parser(schema);
     const TLogCapture log;  // the fault says the same in the client's words
     try {

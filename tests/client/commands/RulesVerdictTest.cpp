@@ -53,6 +53,13 @@ TEST_F(RulesVerdictTest, AllCommandsAgreeOnEachFileOfTheCorpus)
     EXPECT_LT(0u, refused) << "in " << kCorpus;
 }
 
+TEST_F(RulesVerdictTest, AllCommandsReadAsManyBytesAsTheFileIsSaidToHave)
+{
+    const std::string saidToBeEmpty = "/proc/version";
+    ASSERT_EQ(0u, std::filesystem::file_size(saidToBeEmpty));
+    EXPECT_EQ("cimdelta: /proc/version:1: no element found; correct the file\n", CommonVerdict(saidToBeEmpty));
+}
+
 TEST_F(RulesVerdictTest, AllCommandsAgreeOnFilesThatLackAByte)
 {
     std::size_t accepted = 0;
