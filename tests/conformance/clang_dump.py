@@ -8,7 +8,6 @@ import subprocess
 import sys
 
 
-
 def dump(clang, root, probe, option):
     source = os.path.join(root, "tests", "conformance", probe)
     command = [clang, "-std=c++17", "-I", root, "-DBOOST_ENABLE_ASSERT_HANDLER", "-Xclang", option, "-S", "-o", os.devnull, source]

@@ -286,7 +286,7 @@ bool TPlainClass::RemoveMethodDecl(boost::shared_ptr<ICIMMethodDecl>)
 
 void TPlainClass::AddQualifier(boost::shared_ptr<ICIMQualifier> qualifier, TCallContext)
 {
-    fQualifiers.push_back(qualifier);
+    fQualifiers.Add(qualifier);
 }
 
 boost::shared_ptr<ICIMQualifier> TPlainClass::AllocateQualifier(boost::shared_ptr<const ICIMQualifierDecl>, const TCIMValue&,
@@ -303,12 +303,7 @@ boost::shared_ptr<ICIMQualifier> TPlainClass::AllocateQualifier(boost::shared_pt
 
 boost::shared_ptr<ICIMQualifier> TPlainClass::GetQualifier(const std::string& name, TCallContext context) const
 {
-    for (const auto& qualifier : fQualifiers) {
-        if (qualifier->GetName(context) == name) {
-            return qualifier;
-        }
-    }
-    throw TZELException(TZELStatusCode::kNotFound);
+    return fQualifiers.Get(name, context);
 }
 
 boost::shared_ptr<ICIMQualifier> TPlainClass::GetQualifier(const std::string&, bool&, TCallContext) const
@@ -318,11 +313,7 @@ boost::shared_ptr<ICIMQualifier> TPlainClass::GetQualifier(const std::string&, b
 
 void TPlainClass::EnumerateQualifiers(const boost::function<bool(boost::shared_ptr<ICIMQualifier>)>& callback, TCallContext) const
 {
-    for (const auto& qualifier : fQualifiers) {
-        if (!callback(qualifier)) {
-            return;
-        }
-    }
+    fQualifiers.Enumerate(callback);
 }
 
 }  // namespace NORVZEL20

@@ -7,6 +7,7 @@
 #include <vector>
 
 #include "host/ICIMClass.h"
+#include "tests/support/plain/TPlainQualifiers.h"
 
 namespace NORVZEL20 {
 
@@ -96,7 +97,7 @@ class TPlainClass : public ICIMClass, public boost::enable_shared_from_this<TPla
     std::vector<boost::weak_ptr<ICIMClass>> fSubClasses;
     std::vector<boost::shared_ptr<TPlainPropertyDecl>> fDecls;
     std::vector<boost::shared_ptr<ICIMInstance>> fInstances;
-    std::vector<boost::shared_ptr<ICIMQualifier>> fQualifiers;
+    TPlainQualifiers fQualifiers;
     std::uint64_t fLastNumber = 0;
 };
 

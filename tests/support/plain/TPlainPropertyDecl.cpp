@@ -3,7 +3,6 @@
 #include <boost/smart_ptr/make_shared.hpp>
 #include <utility>
 
-#include "host/TZELException.h"
 #include "tests/support/plain/TPlainQualifier.h"
 
 namespace NORVZEL20 {
@@ -14,9 +13,7 @@ TPlainPropertyDecl::TPlainPropertyDecl(std::string name, TCIMValue defaultValue)
 
 bool TPlainPropertyDecl::IsKey() const
 {
-    bool found = false;
-    GetQualifier("Key", found, TCallContext());
-    return found;
+    return fQualifiers.Find("Key", TCallContext()) != nullptr;
 }
 
 const std::string& TPlainPropertyDecl::GetName(TCallContext) const
@@ -36,7 +33,7 @@ const TCIMValue& TPlainPropertyDecl::GetDefaultValue(TCallContext) const
 
 void TPlainPropertyDecl::AddQualifier(boost::shared_ptr<ICIMQualifier> qualifier, TCallContext)
 {
-    fQualifiers.push_back(qualifier);
+    fQualifiers.Add(qualifier);
 }
 
 boost::shared_ptr<ICIMQualifier> TPlainPropertyDecl::AllocateQualifier(boost::shared_ptr<const ICIMQualifierDecl> decl,
@@ -54,34 +51,20 @@ boost::shared_ptr<ICIMQualifier> TPlainPropertyDecl::AllocateQualifier(boost::sh
 
 boost::shared_ptr<ICIMQualifier> TPlainPropertyDecl::GetQualifier(const std::string& name, TCallContext context) const
 {
-    bool found = false;
-    auto qualifier = GetQualifier(name, found, context);
-    if (!found) {
-        throw TZELException(TZELStatusCode::kNotFound);
-    }
-    return qualifier;
+    return fQualifiers.Get(name, context);
 }
 
 void TPlainPropertyDecl::EnumerateQualifiers(const boost::function<bool(boost::shared_ptr<ICIMQualifier>)>& callback,
                                              TCallContext) const
 {
-    for (const auto& qualifier : fQualifiers) {
-        if (!callback(qualifier)) {
-            return;
-        }
-    }
+    fQualifiers.Enumerate(callback);
 }
 
 boost::shared_ptr<ICIMQualifier> TPlainPropertyDecl::GetQualifier(const std::string& name, bool& found, TCallContext context) const
 {
-    for (const auto& qualifier : fQualifiers) {
-        if (qualifier->GetName(context) == name) {
-            found = true;
-            return qualifier;
-        }
-    }
-    found = false;
-    return nullptr;
+    const auto qualifier = fQualifiers.Find(name, context);
+    found = qualifier != nullptr;
+    return qualifier;
 }
 
 }  // namespace NORVZEL20

@@ -1,9 +1,9 @@
 #pragma once
 
 #include <string>
-#include <vector>
 
 #include "host/ICIMPropertyDecl.h"
+#include "tests/support/plain/TPlainQualifiers.h"
 
 namespace NORVZEL20 {
 
@@ -31,7 +31,7 @@ class TPlainPropertyDecl : public ICIMPropertyDecl {
   private:
     std::string fName;
     TCIMValue fDefault;
-    std::vector<boost::shared_ptr<ICIMQualifier>> fQualifiers;
+    TPlainQualifiers fQualifiers;
 };
 
 }  // namespace NORVZEL20
