@@ -16,6 +16,7 @@
 // A difference of another kind ends with its inventories. Lists of numbers have one for each inventory, the reference first.
 #include "client/report/JsonFormat.h"
 
+#include "client/report/JsonCoverage.h"
 #include "client/report/JsonValue.h"
 #include "embedded/value/TValueText.h"
 
@@ -34,40 +35,6 @@ const char* KindName(TDifference::EKind kind)
         return "onlyInOthers";
     default:
         return "changed";
-    }
-}
-
-const char* StateName(TCoverage::EState state)
-{
-    switch (state) {
-    case TCoverage::kCompared:
-        return "compared";
-    case TCoverage::kExcludedByRules:
-        return "excludedByRules";
-    case TCoverage::kUnknownToReference:
-        return "unknownToReference";
-    default:
-        return "madeByCimdelta";
-    }
-}
-
-const char* NoteName(TSchemaNote::EKind kind)
-{
-    switch (kind) {
-    case TSchemaNote::kClassDeclared:
-        return "classDeclared";
-    case TSchemaNote::kPropertyDeclared:
-        return "propertyDeclared";
-    case TSchemaNote::kClassRespelled:
-        return "classRespelled";
-    case TSchemaNote::kPropertyRespelled:
-        return "propertyRespelled";
-    case TSchemaNote::kOperatingSystemMade:
-        return "operatingSystemMade";
-    case TSchemaNote::kTypeDiffers:
-        return "typeDiffers";
-    default:
-        return "keysDiffer";
     }
 }
 
@@ -122,44 +89,6 @@ TJson JsonOfSummary(const TComparisonReport& report)
             {"changedValues", counts.changedValues},
             {"changedInstances", counts.changedInstances},
             {"everythingCompared", report.coverage.IsComplete()}};
-}
-
-TJson JsonOfClass(const TCoverage::TClass& cls)
-{
-    return {{"class", cls.name},
-            {"state", StateName(cls.state)},
-            {"instances", cls.instances},
-            {"propertiesLeftOut", cls.leftOut},
-            {"excludedKeys", cls.excludedKeys},
-            {"sharingKeys", cls.sharing}};
-}
-
-TJson JsonOfNote(const TComparisonReport& report, const TSchemaNote& note)
-{
-    TJson json = {{"kind", NoteName(note.kind)},
-                  {"inventory", report.labels[note.inventory]},
-                  {"asIn", report.labels[note.source]},
-                  {"class", note.className}};
-    if (!note.property.empty()) {
-        json["property"] = note.property;
-    }
-    if (!note.before.empty()) {
-        json["before"] = note.before;
-    }
-    return json;
-}
-
-TJson JsonOfCoverage(const TComparisonReport& report)
-{
-    TJson classes = TJson::array();
-    for (const TCoverage::TClass& cls : report.coverage.classes) {
-        classes.push_back(JsonOfClass(cls));
-    }
-    TJson notes = TJson::array();
-    for (const TSchemaNote& note : report.coverage.notes) {
-        notes.push_back(JsonOfNote(report, note));
-    }
-    return {{"classes", classes}, {"classesWithoutInstances", report.coverage.classesWithout}, {"schema", notes}};
 }
 
 TJson JsonOfInventories(const TComparisonReport& report)
