@@ -18,10 +18,10 @@ std::string Begin()
     return std::string(folder == nullptr || *folder == '\0' ? "/tmp" : folder) + "/cimdelta-";
 }
 
-TUnfinishedFile MakeFile(const std::string& begin)
+std::unique_ptr<TUnfinishedFile> MakeNamedFile(const std::string& begin)
 {
     try {
-        return TUnfinishedFile(begin);
+        return std::make_unique<TUnfinishedFile>(begin);
     } catch (const std::system_error& error) {
         throw TClientError(begin + "XXXXXX: no temporary file can be made", error.code(), kAdvice);
     }
@@ -29,13 +29,17 @@ TUnfinishedFile MakeFile(const std::string& begin)
 
 }  // namespace
 
-TTemporaryFile::TTemporaryFile(const std::string& content) : fFile(MakeFile(Begin()))
+TTemporaryFile::TTemporaryFile(const std::string& content) : fAnonymous(TAnonymousFile::TryMake(content))
 {
+    if (fAnonymous) {
+        return;
+    }
+    fNamed = MakeNamedFile(Begin());
     try {
-        WriteWhole(fFile.GetDescriptor(), content);
-        fFile.Close();
+        WriteWhole(fNamed->GetDescriptor(), content);
+        fNamed->Close();
     } catch (const std::system_error& error) {
-        throw TClientError(fFile.GetPath() + ": cannot be written", error.code(), kAdvice);
+        throw TClientError(fNamed->GetPath() + ": cannot be written", error.code(), kAdvice);
     }
 }
 

@@ -10,7 +10,8 @@ namespace NORVZEL20 {
 
 namespace {
 
-const int kEnding[] = {SIGHUP, SIGINT, SIGQUIT, SIGTERM, SIGXCPU};
+const int kEnding[] = {SIGHUP,  SIGINT,  SIGQUIT, SIGTERM, SIGALRM,   SIGUSR1,  SIGUSR2,
+                       SIGPROF, SIGPOLL, SIGPWR,  SIGXCPU, SIGVTALRM, SIGSTKFLT};
 
 // Set before the handler is installed, and never changed afterwards.
 void (*gCleanUpOnSignal)() = nullptr;
@@ -31,20 +32,25 @@ sigset_t EndingSignals() noexcept
     for (const int number : kEnding) {
         sigaddset(&signals, number);
     }
+    for (int number = SIGRTMIN; number <= SIGRTMAX; ++number) {
+        sigaddset(&signals, number);
+    }
     return signals;
 }
 
 void CleanUpOnEndingSignals(void (*cleanUp)()) noexcept
 {
     gCleanUpOnSignal = cleanUp;
-    for (const int number : kEnding) {
+    const sigset_t ending = EndingSignals();
+    for (int number = 1; number <= SIGRTMAX; ++number) {
         struct sigaction action = {};
-        if (sigaction(number, nullptr, &action) != 0 || action.sa_handler == SIG_IGN) {
+        // An action that is not the default is somebody's choice: nohup ignores SIGHUP, a profiler handles SIGPROF.
+        if (sigismember(&ending, number) != 1 || sigaction(number, nullptr, &action) != 0 || action.sa_handler != SIG_DFL) {
             continue;
         }
         action = {};
         action.sa_handler = &CleanUpAndEnd;
-        action.sa_mask = EndingSignals();
+        action.sa_mask = ending;
         sigaction(number, &action, nullptr);
     }
 }

@@ -89,6 +89,7 @@ extern "C" {
 int __real_open(const char* path, int flags, ...);
 ssize_t __real_read(int descriptor, void* buffer, std::size_t size);
 ssize_t __real_write(int descriptor, const void* buffer, std::size_t size);
+int __real_memfd_create(const char* name, unsigned int flags);
 int __real_mkostemp(char* path, int flags);
 int __real_fchmod(int descriptor, mode_t mode);
 int __real_fsync(int descriptor);
@@ -108,6 +109,11 @@ ssize_t __wrap_read(int descriptor, void* buffer, std::size_t size)
 ssize_t __wrap_write(int descriptor, const void* buffer, std::size_t size)
 {
     return Do("write", [&] { return __real_write(descriptor, buffer, TSystemCalls::Limit(size)); });
+}
+
+int __wrap_memfd_create(const char* name, unsigned int flags)
+{
+    return Do("memfd_create", [&] { return __real_memfd_create(name, flags); });
 }
 
 int __wrap_mkostemp(char* path, int flags)

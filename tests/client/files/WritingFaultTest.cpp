@@ -114,6 +114,7 @@ TEST_F(WritingFaultTest, RulesThatCannotBeKeptAreReported)
     setenv("TMPDIR", fFolder.GetPath().c_str(), 1);
     for (const char* const call : {"mkostemp", "write", "close"}) {
         TSystemCalls calls;
+        calls.Fail("memfd_create", 1, ENOSYS);
         calls.Fail(call, call == std::string("close") ? 3 : 1, ENOSPC);
         const std::string message = Complaint({"compare", "web01.xml", "web02.xml"});
         EXPECT_EQ("cimdelta: " + fFolder.GetPath() + "/cimdelta-", message.substr(0, fFolder.GetPath().size() + 20)) << call;
