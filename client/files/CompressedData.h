@@ -1,8 +1,16 @@
 #pragma once
 
 #include <string>
+#include <string_view>
 
 namespace NORVZEL20 {
+
+/// How many first bytes of a file RecognizeCompression needs.
+inline constexpr std::size_t kCompressionMark = 6;
+
+/// What a file is compressed with, by its first bytes: "gzip", "xz", "zstd", "bzip2", "lz4", "zip" or "lzip"; empty if with none of
+/// these.
+std::string RecognizeCompression(std::string_view begin);
 
 /// Throws TClientError: the file `name`, compressed with `kind`, is damaged for that reason.
 [[noreturn]] void FailDamaged(const std::string& name, const std::string& kind, const std::string& reason);
