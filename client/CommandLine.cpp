@@ -151,7 +151,8 @@ class TCommandLine {
                                        [this](IConsole& console) { return RunCompare(fCompare, console); });
         AddText(command, "REFERENCE", fCompare.reference, kInventoryHelp)->required()->option_text(" ");
         AddText(command, "OTHER", fCompare.others, "the inventories to compare with the reference")->required()->option_text("...");
-        AddText(command, "--spec", fCompare.rules, "a rules file that says what to compare (default: everything)")
+        AddText(command, "--spec", fCompare.rules,
+                "a rules file that says what to compare, or - for standard input (default: everything)")
             ->option_text("RULES");
         AddFormat(command, fCompare.format);
         AddOutput(command, fCompare.output);
@@ -163,7 +164,7 @@ class TCommandLine {
     {
         CLI::App* command = AddCommand("check", "show what a rules file says, what follows from it and what may be a mistake",
                                        [this](IConsole& console) { return RunCheck(fCheck, console); });
-        AddText(command, "RULES", fCheck.rules, "the rules file")->required()->option_text(" ");
+        AddText(command, "RULES", fCheck.rules, "the rules file, or - for standard input")->required()->option_text(" ");
         AddSchemas(command, fCheck.schemas);
         AddOutput(command, fCheck.output);
     }

@@ -5,14 +5,16 @@
 #include "client/process/ExitStatus.h"
 #include "client/report/ResultOutput.h"
 #include "client/report/TRulesListing.h"
+#include "client/rules/ReadRules.h"
 
 namespace NORVZEL20 {
 
 int RunCheck(const TCheckOptions& options, IConsole& console)
 {
+    const std::optional<TRulesText> rules = ReadRulesFor(options.schemas, options.rules);
     std::vector<TInventory> inventories = TInventoryLoader(console).Load(options.schemas);
     CompleteInventories(inventories, console);
-    DeliverResult(console, options.output, TRulesListing(options.rules, inventories.front()).WriteCheck());
+    DeliverResult(console, options.output, TRulesListing(*rules, inventories.front()).WriteCheck());
     return kExitSuccess;
 }
 

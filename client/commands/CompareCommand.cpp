@@ -7,6 +7,7 @@
 #include "client/report/JsonFormat.h"
 #include "client/report/ResultOutput.h"
 #include "client/report/TTextFormat.h"
+#include "client/rules/ReadRules.h"
 
 namespace NORVZEL20 {
 
@@ -33,8 +34,10 @@ int RunCompare(const TCompareOptions& options, IConsole& console)
 {
     std::vector<std::string> paths(1, options.reference);
     paths.insert(paths.end(), options.others.begin(), options.others.end());
+    // Before the inventories, which may take long to load.
+    const std::optional<TRulesText> rules = ReadRulesFor(paths, options.rules);
     std::vector<TInventory> inventories = TInventoryLoader(console).Load(paths);
-    const TComparisonReport report = TComparison(inventories, console).Run(options.rules, options.strictSchema);
+    const TComparisonReport report = TComparison(inventories, console).Run(rules, options.strictSchema);
     DeliverResult(console, options.output, Write(report, options.format, console.IsColored() && IsStandardOutput(options.output)));
     return report.differences.empty() ? kExitSuccess : kExitDifferences;
 }

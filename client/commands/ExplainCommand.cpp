@@ -5,14 +5,16 @@
 #include "client/process/ExitStatus.h"
 #include "client/report/ResultOutput.h"
 #include "client/report/TRulesListing.h"
+#include "client/rules/ReadRules.h"
 
 namespace NORVZEL20 {
 
 int RunExplain(const TExplainOptions& options, IConsole& console)
 {
+    const std::optional<TRulesText> rules = ReadRulesFor(options.schemas, options.rules);
     std::vector<TInventory> inventories = TInventoryLoader(console).Load(options.schemas);
     CompleteInventories(inventories, console);
-    TRulesListing listing(options.rules, inventories.front());
+    TRulesListing listing(*rules, inventories.front());
     const std::size_t dot = options.element.find('.');
     DeliverResult(console, options.output,
                   dot == std::string::npos

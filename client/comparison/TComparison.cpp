@@ -1,8 +1,8 @@
 // A comparison in steps:
 //
 // (1) Complete the inventories: each then declares what the others declare. With --strict-schema, leave them as they are.
-// (2) Read the rules. If the person named no file, make rules that include every class, in a temporary file: the plug-in reads
-//     rules from files only.
+// (2) Read the rules; if there are none, make rules that include every class. The plug-in reads rules from files only and by name,
+//     so it gets a temporary file. It holds exactly what was read here: a file could change meanwhile, and standard input is gone.
 // (3) Find out what will be compared. This must be done before the run, which may add instances to the reference.
 // (4) Let the plug-in compare. Its log is captured, because it says more about a failure than the exception does.
 // (5) Read the plug-in's records back as differences with values.
@@ -63,22 +63,20 @@ void KeepForever(const boost::shared_ptr<TDeltaNamespace>& records)
 
 }  // namespace
 
-TComparisonReport TComparison::Run(const std::string& rulesFile, bool strictSchema)
+TComparisonReport TComparison::Run(const std::optional<TRulesText>& rules, bool strictSchema)
 {
     fStrictSchema = strictSchema;
     if (!strictSchema) {
         fNotes = CompleteInventories(fInventories, fConsole);
     }
-    if (!rulesFile.empty()) {
-        return RunWith(rulesFile, rulesFile);
-    }
-    const TTemporaryFile made(MakeRulesForEverything(fInventories[0], fNotes));
-    return RunWith(made.GetPath(), "the rules made for " + fInventories[0].path);
+    const TRulesText text =
+        rules ? *rules : TRulesText{"the rules made for " + fInventories[0].path, MakeRulesForEverything(fInventories[0], fNotes)};
+    TRules meaning(fInventories[0].ns, text);
+    return RunWith(meaning, text);
 }
 
-TComparisonReport TComparison::RunWith(const std::string& rulesFile, const std::string& shownName)
+TComparisonReport TComparison::RunWith(TRules& rules, const TRulesText& text)
 {
-    TRules rules(fInventories[0].ns, rulesFile, shownName);
     const TProgress progress(fConsole, "comparing");
     TComparisonReport report;
     for (const TInventory& inventory : fInventories) {
@@ -90,7 +88,8 @@ TComparisonReport TComparison::RunWith(const std::string& rulesFile, const std::
     if (rules.HasExcludedKeys()) {
         KeepForever(report.records);
     }
-    report.records->SetSpecFileName(rulesFile);
+    const TTemporaryFile file(text.text);
+    report.records->SetSpecFileName(file.GetPath());
     FindDifferences(*report.records, rules);
     report.differences = TDifferenceReader(fInventories, rules).Read(*report.records);
     return report;

@@ -1,6 +1,6 @@
 #pragma once
 
-#include <string>
+#include <optional>
 #include <vector>
 
 #include "client/comparison/TComparisonReport.h"
@@ -18,13 +18,13 @@ class TComparison {
     /// that one unless the two have different types, keys or static values.
     TComparison(std::vector<TInventory>& inventories, IConsole& console) : fInventories(inventories), fConsole(console) {}
 
-    /// Compares under the rules of `rulesFile`, or, if that is empty, every class in every property. With `strictSchema` the
-    /// inventories are not completed first. Call this once.
+    /// Compares under `rules`, or without them every class in every property. With `strictSchema` the inventories are not
+    /// completed first. Call this once.
     /// Errors: TClientError; std::bad_alloc.
-    TComparisonReport Run(const std::string& rulesFile, bool strictSchema);
+    TComparisonReport Run(const std::optional<TRulesText>& rules, bool strictSchema);
 
   private:
-    TComparisonReport RunWith(const std::string& rulesFile, const std::string& shownName);
+    TComparisonReport RunWith(TRules& rules, const TRulesText& text);
     void FindDifferences(TDeltaNamespace& records, TRules& rules);
     bool MustKeepReference() const;
 

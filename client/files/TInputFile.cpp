@@ -7,6 +7,8 @@
 #include <sys/stat.h>
 #include <unistd.h>
 
+#include <algorithm>
+
 #include "client/process/StandardDescriptors.h"
 #include "client/process/SystemError.h"
 #include "client/process/TClientError.h"
@@ -89,6 +91,13 @@ std::size_t TInputFile::ReadDescriptor(char* buffer, std::size_t size)
         } else if (reason != std::errc::interrupted) {
             throw TClientError(fName + ": cannot be read", reason);
         }
+    }
+}
+
+void RequireOneStandardInput(const std::vector<std::string>& paths)
+{
+    if (std::count(paths.begin(), paths.end(), "-") > 1) {
+        throw TClientError("standard input (-) can be read only once; save it to a file first");
     }
 }
 

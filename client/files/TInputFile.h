@@ -1,6 +1,7 @@
 #pragma once
 
 #include <string>
+#include <vector>
 
 #include "client/files/IByteSource.h"
 
@@ -32,5 +33,8 @@ class TInputFile : public IByteSource {
     std::string fPeeked;
     std::size_t fDelivered = 0;  // how many of the peeked bytes Read has returned
 };
+
+/// Throws TClientError if more than one of the paths is "-".
+void RequireOneStandardInput(const std::vector<std::string>& paths);
 
 }  // namespace NORVZEL20

@@ -14,6 +14,7 @@
 #include <exception>
 #include <thread>
 
+#include "client/files/TInputFile.h"
 #include "client/inventory/InventoryLabels.h"
 #include "client/inventory/TInventoryFile.h"
 #include "client/process/LackOfMemory.h"
@@ -129,9 +130,7 @@ class TParallelLoad {
 
 std::vector<TInventory> TInventoryLoader::Load(const std::vector<std::string>& paths)
 {
-    if (std::count(paths.begin(), paths.end(), "-") > 1) {
-        throw TClientError("standard input (-) can be read only once; save it to a file first");
-    }
+    RequireOneStandardInput(paths);
     const std::vector<std::string> labels = MakeInventoryLabels(paths);
     std::vector<TInventory> inventories;
     for (std::size_t i = 0; i < paths.size(); ++i) {

@@ -57,8 +57,8 @@ std::size_t CountWithSubclasses(TInMemNamespace& ns, const std::string& classNam
 
 }  // namespace
 
-TRulesListing::TRulesListing(const std::string& file, const TInventory& schema)
-    : fFile(file), fSchema(schema), fRules(schema.ns, file, file), fDocument(fRules.GetDocument()), fTrace(fDocument, schema.ns)
+TRulesListing::TRulesListing(const TRulesText& rules, const TInventory& schema)
+    : fFile(rules.name), fSchema(schema), fRules(schema.ns, rules), fDocument(fRules.GetDocument()), fTrace(fDocument, schema.ns)
 {}
 
 std::string TRulesListing::WriteCheck()

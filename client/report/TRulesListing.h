@@ -14,7 +14,7 @@ namespace NORVZEL20 {
 class TRulesListing {
   public:
     /// Reads the rules; `schema` must outlive this. Errors: TClientError for a file that the plug-in does not accept.
-    TRulesListing(const std::string& file, const TInventory& schema);
+    TRulesListing(const TRulesText& rules, const TInventory& schema);
     TRulesListing(const TRulesListing&) = delete;
     TRulesListing& operator=(const TRulesListing&) = delete;
 

@@ -5,6 +5,7 @@
 #include <vector>
 
 #include "client/rules/TRulesDocument.h"
+#include "client/rules/TRulesText.h"
 #include "engine/TCIMDiffEngine.h"
 #include "host/ICIMClass.h"
 #include "host/ICIMInstance.h"
@@ -13,12 +14,11 @@
 
 namespace NORVZEL20 {
 
-/// A rules file as the plug-in's own parser reads it, and the plug-in's own answers to what follows from it.
+/// Rules as the plug-in's own parser reads it, and the plug-in's own answers to what follows from it.
 class TRules {
   public:
-    /// Reads the file once, as a whole, with `schema` as the reference. Messages call it `shownName`.
-    /// Errors: TClientError that names the file, the line, what is wrong there and what can be done.
-    TRules(boost::shared_ptr<ICIMNamespace> schema, const std::string& file, const std::string& shownName);
+    /// `schema` is the reference. Errors: TClientError that names the rules, the line, what is wrong there and what can be done.
+    TRules(boost::shared_ptr<ICIMNamespace> schema, const TRulesText& text);
     TRules(const TRules&) = delete;
     TRules& operator=(const TRules&) = delete;
 
@@ -34,7 +34,7 @@ class TRules {
     /// Whether any class excludes any key.
     bool HasExcludedKeys() const;
 
-    /// What the file says, element by element.
+    /// What the rules say, element by element.
     const TRulesDocument& GetDocument() const { return fDocument; }
 
   private:

@@ -24,6 +24,7 @@ struct TRulesDocument {
         std::vector<std::string> excludedKeys;
         unsigned int line = 0;
         std::vector<TListed> listed;  ///< in the order read; if a property is listed twice, the first listing counts
+        bool hasDefault = false;      ///< whether the element names a default; otherwise the default is to exclude
     };
 
     std::vector<TElement> elements;

@@ -8,6 +8,7 @@ namespace NORVZEL20 {
 struct TRulesFault {
     enum EKind {
         kMalformed,              ///< not well-formed XML; `text` is the parser's reason
+        kWrongEncoding,          ///< the bytes are not text in UTF-8 or in an encoding that is read; `text` is the parser's reason
         kUnexpectedElement,      ///< `text` is the element
         kUnknownRootAttribute,   ///< an attribute of DifftoolSpec; `text` is its name
         kUnknownVersion,         ///< `text` is the version

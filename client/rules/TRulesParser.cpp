@@ -11,8 +11,13 @@
 // A tag's name alone says little: inside "value" any start tag is ignored, and any end tag ends the value.
 #include "client/rules/TRulesParser.h"
 
+#include <algorithm>
 #include <utility>
 
+#include "client/process/LackOfMemory.h"
+#include "client/process/TClientError.h"
+#include "client/rules/TLogCapture.h"
+#include "embedded/value/TUtf8.h"
 #include "host/TZELException.h"
 #include "spec/TDiffClassRules.h"
 
@@ -61,9 +66,60 @@ TRulesFault FindClassFault(const TAttributes& attrs)
     return MakeFault(name == attrs.end() || name->second.empty() ? TRulesFault::kNoClassName : TRulesFault::kUnknownClass);
 }
 
+bool IsUtf8(std::string_view text)
+{
+    while (!text.empty()) {
+        const TUtf8::TCharacter character = TUtf8::Decode(text);
+        if (character.length == 0 || character.code == 0) {
+            return false;
+        }
+        text.remove_prefix(character.length);
+    }
+    return true;
+}
+
+// Whether the XML is refused for its encoding. Bytes that are not UTF-8 make an invalid token, unless the document declares another
+// encoding or begins with the mark of UTF-16.
+bool IsWrongEncoding(const std::string& reason, std::string_view text)
+{
+    if (reason.find("encoding") != std::string::npos) {
+        return true;
+    }
+    const std::string_view head = text.substr(0, text.find('>'));
+    const bool isOther = head.find("encoding=") != std::string_view::npos && head.find("utf-8") == std::string_view::npos &&
+                         head.find("UTF-8") == std::string_view::npos;
+    const bool isUtf16 = text.substr(0, 2) == "\xff\xfe" || text.substr(0, 2) == "\xfe\xff";
+    return reason == "not well-formed (invalid token)" && !isOther && !isUtf16 && !IsUtf8(text);
+}
+
 }  // namespace
 
 TRulesParser::TRulesParser(boost::shared_ptr<ICIMNamespace> schema) : TDiffXMLParser(std::move(schema)) {}
+
+void TRulesParser::Read(const TRulesText& rules)
+{
+    const TLogCapture log;  // the fault says the same in the client's words
+    std::string text = rules.text;
+    try {
+        Parse(text.data(), text.size());
+    } catch (const TZELException& error) {
+        ThrowIfOutOfMemory(error);
+        if (fFault.kind == TRulesFault::kMalformed && IsWrongEncoding(fFault.text, rules.text)) {
+            fFault.kind = TRulesFault::kWrongEncoding;
+        }
+        throw TClientError(fFault.Describe(rules.name));
+    }
+}
+
+bool TRulesParser::IsInRoot() const
+{
+    return fStateStack.size() == kInRoot;
+}
+
+bool TRulesParser::IsInValue() const
+{
+    return fStateStack.size() == kInValue;
+}
 
 void TRulesParser::StartElement(const char* name, TAttributes& attrs)
 {
@@ -79,13 +135,13 @@ void TRulesParser::StartElement(const char* name, TAttributes& attrs)
         throw;
     }
     if (fStateStack.size() > depth) {
-        NoteStart(name);
+        NoteStart(name, attrs.count("default") != 0);
     }
 }
 
 void TRulesParser::EndElement(const char* name)
 {
-    const bool isValue = fStateStack.size() == kInValue;
+    const bool isValue = IsInValue();
     const std::string text = isValue ? fCharData : std::string();  // before the plug-in clears it
     try {
         TDiffXMLParser::EndElement(name);
@@ -106,11 +162,11 @@ void TRulesParser::FatalError(const char* message)
     TDiffXMLParser::FatalError(message);
 }
 
-void TRulesParser::NoteStart(const std::string& name)
+void TRulesParser::NoteStart(const std::string& name, bool hasDefault)
 {
     if (fStateStack.size() == kInClass) {
         fDocument.elements.push_back(
-            {fCurrentRules->fClassName, fCurrentRules->fDefault, fCurrentRules->fExcludedKeys, GetCurLine(), {}});
+            {fCurrentRules->fClassName, fCurrentRules->fDefault, fCurrentRules->fExcludedKeys, GetCurLine(), {}, hasDefault});
     } else if (fStateStack.size() == kInList) {
         fTreatment = name == "includelist" ? TCIMDiffEngine::INCLUDE : TCIMDiffEngine::EXCLUDE;
     }

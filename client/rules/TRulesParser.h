@@ -5,6 +5,7 @@
 
 #include "client/rules/TRulesDocument.h"
 #include "client/rules/TRulesFault.h"
+#include "client/rules/TRulesText.h"
 #include "spec/TDiffXMLParser.h"
 
 namespace NORVZEL20 {
@@ -21,13 +22,22 @@ class TRulesParser : public TCIMDiffEngine::TDiffXMLParser {
     void EndElement(const char* name) override;
     [[noreturn]] void FatalError(const char* message) override;
 
+    /// Reads the whole document. Errors: TClientError that says what is wrong, where, and what can be done.
+    void Read(const TRulesText& rules);
+
     /// What has been accepted so far.
     const TRulesDocument& GetDocument() const { return fDocument; }
     /// Why the parse ended with TZELException; without meaning otherwise.
     const TRulesFault& GetFault() const { return fFault; }
 
+  protected:
+    /// Whether the element in progress is DifftoolSpec.
+    bool IsInRoot() const;
+    /// Whether the element in progress is a property's name.
+    bool IsInValue() const;
+
   private:
-    void NoteStart(const std::string& name);
+    void NoteStart(const std::string& name, bool hasDefault);
     void NoteFault(const char* reason, const TRulesFault& fault);
 
     TRulesDocument fDocument;

@@ -37,7 +37,27 @@ TEST_F(BadInputTest, EachUnusableRulesFileGetsOneMessage)
          "R:1: class INV_Disk has no property \" Model \"; the name counts as it stands between the tags, blanks included"},
         {"<DifftoolSpec>\n<class name='INV_Disk'>\n</DifftoolSpec>", "R:3: mismatched tag; correct the file"},
         {"<DifftoolSpec>", "R:1: no element found; correct the file"},
-        {"", "R:1: no element found; correct the file"},
+        {"<DifftoolSpec><class name=' INV_Disk'/></DifftoolSpec>",
+         "R:1: class \" INV_Disk\" is not declared in the reference; correct the name or remove the element"},
+        {"<DifftoolSpec><class name='%t %c'/></DifftoolSpec>",
+         "R:1: class \"%t %c\" is not declared in the reference; correct the name or remove the element"},
+        {"<DifftoolSpec><class name='INV_Disk'><includelist><value/></includelist></class></DifftoolSpec>",
+         "R:1: class INV_Disk has no property \"\"; the name counts as it stands between the tags, blanks included"},
+        {"<DifftoolSpec><class name='&lt;root&gt;'><includelist><value>Name</value></includelist></class></DifftoolSpec>",
+         "R:1: class <root> has no property \"Name\"; the name counts as it stands between the tags, blanks included"},
+        {"", "R: the file is empty; rules are an element DifftoolSpec with elements class in it"},
+        {" \n\n", "R: the file is empty; rules are an element DifftoolSpec with elements class in it"},
+        {"<DifftoolSpec>\n<!-- f\xFCr -->\n</DifftoolSpec>",
+         "R:2: the text cannot be decoded (not well-formed (invalid token)); save the file as UTF-8"},
+        {"<?xml version='1.0' encoding='KOI8-R'?>\n<DifftoolSpec/>",
+         "R:1: the text cannot be decoded (unknown encoding); save the file as UTF-8"},
+        {"<?xml version='1.0' encoding='UTF-16'?>\n<DifftoolSpec/>",
+         "R:1: the text cannot be decoded (encoding specified in XML declaration is incorrect); save the file as UTF-8"},
+        {"<DifftoolSpec>\n&<DifftoolSpec>", "R:2: not well-formed (invalid token); correct the file"},
+        {"<?xml version='1.0' encoding='ISO-8859-1'?><DifftoolSpec>\xFC & </DifftoolSpec>",
+         "R:1: not well-formed (invalid token); correct the file"},
+        {"\x1f\x8b\x08", "R: this file is compressed with gzip; rules are read as plain text only, so decompress it first"},
+        {"\x28\xb5\x2f\xfd", "R: this file is compressed with zstd; rules are read as plain text only, so decompress it first"},
         {"rules", "R:1: syntax error; correct the file"},
     };
     int number = 0;
@@ -50,22 +70,78 @@ TEST_F(BadInputTest, EachUnusableRulesFileGetsOneMessage)
     }
 }
 
+TEST_F(BadInputTest, LongTextFromRulesIsShortened)
+{
+    const std::string text(100, 'x');
+    const std::string shown = std::string(80, 'x') + "...";
+    const struct {
+        std::string rules;
+        std::string message;
+    } rows[] = {
+        {"<" + text + "/>", "element " + shown + " is not"},
+        {"<DifftoolSpec version='" + text + "'/>", "version \"" + shown + "\" of"},
+        {"<DifftoolSpec " + text + "=''/>", "attribute " + shown + ";"},
+        {"<DifftoolSpec><class " + text + "=''/></DifftoolSpec>", "attribute " + shown + ";"},
+        {"<DifftoolSpec><class default='" + text + "'/></DifftoolSpec>", "default \"" + shown + "\" is"},
+        {"<DifftoolSpec><class name='" + text + "'/></DifftoolSpec>", "class " + shown + " is"},
+        {"<DifftoolSpec><class name='INV_Disk'><includelist><value>" + text + "</value></includelist></class></DifftoolSpec>",
+         "property \"" + shown + "\";"},
+    };
+    for (const auto& row : rows) {
+        const std::string complaint = Complaint({"check", Scratch("long", row.rules), "--schema", "web01.xml"});
+        EXPECT_NE(std::string::npos, complaint.find(row.message)) << complaint;
+    }
+}
+
 TEST_F(BadInputTest, EachPathThatIsNotARulesFileGetsItsMessage)
 {
-    EXPECT_EQ("cimdelta: none.xml: cannot be opened: No such file or directory\n",
+    EXPECT_EQ("cimdelta: none.xml: cannot be opened: No such file or directory; name a rules file that can be read, or - for "
+              "standard input\n",
               Complaint({"compare", "--spec", "none.xml", "web01.xml", "web02.xml"}));
-    EXPECT_EQ("cimdelta: .: is not a regular file; save the rules to a file and name that file\n",
+    EXPECT_EQ("cimdelta: .: is a directory; name a rules file that can be read, or - for standard input\n",
               Complaint({"compare", "--spec", ".", "web01.xml", "web02.xml"}));
-    EXPECT_EQ("cimdelta: rules.xml|fVMWareEnable: a rules file cannot have |fVMWareEnable in its name; rename it\n",
-              Complaint({"compare", "--spec", "rules.xml|fVMWareEnable", "web01.xml", "web02.xml"}));
+}
+
+TEST_F(BadInputTest, RulesThatCannotBeReadAreTheOnlyMessage)
+{
+    // Nothing is said of the inventories either, which lack an operating system.
+    EXPECT_EQ("cimdelta: none.xml: cannot be opened: No such file or directory; name a rules file that can be read, or - for "
+              "standard input\n",
+              Complaint({"compare", "--spec", "none.xml", "other-schema.xml", "missing.xml"}));
+    const std::string rules = Scratch("malformed", "<DifftoolSpec>");
+    for (const std::vector<std::string>& command :
+         {std::vector<std::string>{"compare", "--spec", rules, "other-schema.xml", "other-schema.xml"},
+          std::vector<std::string>{"check", rules, "--schema", "other-schema.xml"},
+          std::vector<std::string>{"explain", "INV_Extra", "--spec", rules, "--schema", "other-schema.xml"}}) {
+        EXPECT_EQ("cimdelta: R:1: no element found; correct the file\n", Shorten(Complaint(command), rules, "R"));
+    }
+}
+
+/// The plug-in would compare without rules if it were given a file of this name.
+TEST_F(BadInputTest, RulesMayHaveAnyName)
+{
+    const std::string rules =
+        Scratch("rules.xml|fVMWareEnable", "<DifftoolSpec><class name='INV_Disk' default='include'/></DifftoolSpec>");
+    const std::string report = Result({"compare", "--spec", rules, "web01.xml", "web02.xml"});
+    EXPECT_NE(std::string::npos, report.find("INV_Disk")) << report;
+    EXPECT_EQ(std::string::npos, report.find("INV_Package\n")) << report;
 }
 
 TEST_F(BadInputTest, RulesLargerThanTheLimitAreRefused)
 {
     const std::string rules = Scratch("large", "");
     ASSERT_EQ(0, truncate(rules.c_str(), 104857601));
-    EXPECT_EQ("cimdelta: R: is larger than 104857600 bytes, the most that a rules file may have\n",
+    EXPECT_EQ("cimdelta: R: is larger than 104857600 bytes, the most that rules may have\n",
               Shorten(Complaint({"compare", "--spec", rules, "web01.xml", "web02.xml"}), rules, "R"));
+}
+
+TEST_F(BadInputTest, StandardInputIsReadOnlyOnce)
+{
+    const std::string message = "cimdelta: standard input (-) can be read only once; save it to a file first\n";
+    EXPECT_EQ(message, Complaint({"compare", "-", "-"}));
+    EXPECT_EQ(message, Complaint({"compare", "--spec", "-", "web01.xml", "-"}));
+    EXPECT_EQ(message, Complaint({"check", "-", "--schema", "-"}));
+    EXPECT_EQ(message, Complaint({"explain", "INV_Disk", "--spec", "-", "--schema", "-"}));
 }
 
 TEST_F(BadInputTest, InventoriesThatCannotBeOpenedAreNamed)
@@ -74,7 +150,6 @@ TEST_F(BadInputTest, InventoriesThatCannotBeOpenedAreNamed)
     EXPECT_EQ("cimdelta: none.xml: cannot be opened: No such file or directory\n", Complaint({"show", "none.xml"}));
     EXPECT_EQ("cimdelta: .: is a directory; name an inventory file, or - for standard input\n",
               Complaint({"compare", "web01.xml", "."}));
-    EXPECT_EQ("cimdelta: standard input (-) can be read only once; save it to a file first\n", Complaint({"compare", "-", "-"}));
 }
 
 TEST_F(BadInputTest, OfSeveralBadInventoriesTheFirstIsReported)

@@ -51,6 +51,20 @@ TEST_F(ExecutableTest, StandardInputIsAnInventoryToo)
         Shell("compare web01.xml -", "head -c 700 web02.xml.gz | "));
 }
 
+TEST_F(ExecutableTest, RulesMayComeFromStandardInputOrAPipe)
+{
+    const std::string compared = Shell("compare --spec rules.xml web01.xml web02.xml");
+    EXPECT_EQ("[1]", compared.substr(0, 3));
+    EXPECT_EQ(compared, Shell("compare --spec - web01.xml web02.xml < rules.xml"));
+    EXPECT_EQ(compared, Shell("compare --spec /dev/fd/0 web01.xml web02.xml", "cat rules.xml | "));
+    EXPECT_EQ("[0]\nINV_Package.Size: not compared, excluded by the list at standard input:5 (element for class INV_Package)\n--\n",
+              Shell("explain INV_Package.Size --spec - --schema web01.xml < rules.xml"));
+    EXPECT_EQ("[0]\nstandard input: 2 elements, 0 warnings\n",
+              Shell("check - --schema web01.xml", "cat rules.xml | ").substr(0, 43));
+    EXPECT_EQ("[2]\n--\ncimdelta: standard input: the file is empty; rules are an element DifftoolSpec with elements class in it\n",
+              Shell("check - --schema web01.xml < /dev/null"));
+}
+
 TEST_F(ExecutableTest, AnOutputFileAppearsWhole)
 {
     const std::string report = Shell("compare web01.xml web02.xml");
