@@ -15,6 +15,7 @@
 
 #include "client/inventory/RequireClass.h"
 #include "client/process/TClientError.h"
+#include "client/rules/DescribeReducedReferences.h"
 #include "client/text/Counted.h"
 #include "client/text/DisplayText.h"
 #include "embedded/value/TNameText.h"
@@ -112,7 +113,8 @@ void TRulesListing::WriteEffective(const boost::shared_ptr<TInMemClass>& cls)
     AddLine("  " + cls->GetName() + ": " + std::to_string(all.size() - leftOut.size()) + " of " +
             Counted(all.size(), "property", "properties") + " compared" +
             (leftOut.empty() ? "" : ", all but " + boost::algorithm::join(leftOut, ", ")) +
-            (keys.empty() ? "" : "; matched without " + boost::algorithm::join(keys, ", ")));
+            (keys.empty() ? "" : "; matched without " + boost::algorithm::join(keys, ", ")) +
+            (fTrace.FindReducedReferences(*cls).empty() ? "" : "; references compared " + DescribeReducedReferences(keys)));
 }
 
 void TRulesListing::WriteUnmatched()
@@ -182,11 +184,15 @@ bool TRulesListing::HasElement(const std::string& className) const
     });
 }
 
-std::string TRulesListing::Verdict(const TInMemClass& cls, const std::string& property,
-                                   const std::vector<std::string>& compared) const
+std::string TRulesListing::Verdict(const TInMemClass& cls, const std::string& property, const std::vector<std::string>& compared)
 {
     const bool isCompared = Contains(compared, property);
-    return property + ": " + (isCompared ? "compared" : "not compared") + ", " + Reason(cls, property, isCompared);
+    const std::vector<std::string> reduced = fTrace.FindReducedReferences(cls);
+    const bool isReduced = isCompared && std::find(reduced.begin(), reduced.end(), property) != reduced.end();
+    return property + ": " + (isCompared ? "compared" : "not compared") + ", " + Reason(cls, property, isCompared) +
+           (isReduced ? "; references " + DescribeReducedReferences(fRules.ExcludedKeysOf(cls.GetName())) + " (excludekeys, " +
+                            fFile + ":" + std::to_string(fTrace.Find(cls.GetName()).excludedKeysLine) + ")"
+                      : "");
 }
 
 std::string TRulesListing::Reason(const TInMemClass& cls, const std::string& property, bool isCompared) const

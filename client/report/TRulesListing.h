@@ -34,7 +34,7 @@ class TRulesListing {
     void WriteUnmatched();
     void WriteWarnings();
     bool HasElement(const std::string& className) const;
-    std::string Verdict(const TInMemClass& cls, const std::string& property, const std::vector<std::string>& compared) const;
+    std::string Verdict(const TInMemClass& cls, const std::string& property, const std::vector<std::string>& compared);
     std::string Reason(const TInMemClass& cls, const std::string& property, bool isCompared) const;
     std::string Origin(const TRuleTrace::TDecision& decision) const;
     void AddLine(const std::string& text);

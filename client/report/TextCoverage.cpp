@@ -17,22 +17,11 @@
 
 #include "client/text/Counted.h"
 #include "client/text/DisplayText.h"
+#include "client/text/SomeOf.h"
 
 namespace NORVZEL20 {
 
 namespace {
-
-// A longer list is cut, and the number of the other names stands for them. JSON has them all.
-const std::size_t kMostNames = 12;
-
-std::string SomeOf(const std::vector<std::string>& names)
-{
-    if (names.size() <= kMostNames) {
-        return boost::algorithm::join(names, ", ");
-    }
-    const std::vector<std::string> first(names.begin(), names.begin() + kMostNames);
-    return boost::algorithm::join(first, ", ") + " and " + std::to_string(names.size() - kMostNames) + " more";
-}
 
 // Writes the statements, each kind by a function of its own. A kind that does not apply writes nothing.
 class TStatement {

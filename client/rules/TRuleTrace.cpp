@@ -6,15 +6,19 @@
 //     after    a class below has this element's default,   that element came too early
 //              but an element of its own came before
 //
+// When all elements are merged, each class knows its excluded keys, and whether they change how its references are compared.
 // What is odd in an element by itself (letter case, repeated names, keys that are none) needs only the schema.
 #include "client/rules/TRuleTrace.h"
 
 #include <algorithm>
+#include <map>
 #include <set>
 #include <tuple>
 #include <utility>
 
 #include "client/inventory/CollectObjects.h"
+#include "client/rules/DescribeReducedReferences.h"
+#include "client/text/SomeOf.h"
 #include "embedded/value/TNameText.h"
 
 namespace NORVZEL20 {
@@ -47,6 +51,7 @@ TRuleTrace::TRuleTrace(const TRulesDocument& document, boost::shared_ptr<ICIMNam
         CheckNames(index);
         Apply(index);
     }
+    WarnOfReducedReferences();
     std::stable_sort(fWarnings.begin(), fWarnings.end(), [](const TWarning& a, const TWarning& b) {
         return std::tie(a.element, a.line) < std::tie(b.element, b.line);
     });
@@ -84,6 +89,24 @@ TRuleTrace::TDecision TRuleTrace::Decide(const std::string& className, const std
         }
     }
     return entry.byDefault;
+}
+
+std::vector<std::string> TRuleTrace::FindReducedReferences(const ICIMClass& cls) const
+{
+    const std::string& className = cls.GetName(TCallContext());
+    std::vector<std::string> names;
+    if (Find(className).excludedKeys.empty()) {
+        return names;
+    }
+    const auto enumerate = [&cls](const auto& callback) { cls.EnumeratePropertyDecls(callback, TCallContext()); };
+    for (const boost::shared_ptr<ICIMPropertyDecl>& decl : Collect<ICIMPropertyDecl>(enumerate)) {
+        const std::string& name = decl->GetName(TCallContext());
+        if (decl->GetType(TCallContext()) == TCIMValue::TCIMType::kReference &&
+            Decide(className, name).treatment == TCIMDiffEngine::INCLUDE) {
+            names.push_back(name);
+        }
+    }
+    return names;
 }
 
 void TRuleTrace::Apply(std::size_t index)
@@ -167,6 +190,23 @@ void TRuleTrace::CheckKeys(std::size_t index, const boost::shared_ptr<ICIMClass>
         if (!HasKeyThereOrBelow(cls, key)) {
             Warn(index, element.line, "excluded key " + key + " is not a key of class " + element.className);
         }
+    }
+}
+
+// One warning for each element: its keys may reach many classes below its class.
+void TRuleTrace::WarnOfReducedReferences()
+{
+    std::map<std::size_t, std::vector<std::string>> references;
+    for (const boost::shared_ptr<ICIMClass>& cls : AllClassesOf(*fSchema)) {
+        const std::string& className = cls->GetName(TCallContext());
+        for (const std::string& property : FindReducedReferences(*cls)) {
+            references[*fMarks.FindKeys(className)].push_back(className + "." + property);
+        }
+    }
+    for (const auto& [index, properties] : references) {
+        Warn(index, fElements[index].line,
+             "excludekeys also applies to references: those in " + SomeOf(properties) + " are compared " +
+                 DescribeReducedReferences(fElements[index].excludedKeys));
     }
 }
 

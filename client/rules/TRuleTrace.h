@@ -47,6 +47,10 @@ class TRuleTrace {
     /// What decides the property: its listing or the default.
     TDecision Decide(const std::string& className, const std::string& property) const;
 
+    /// The reference properties of the class that are compared although keys are excluded. The plug-in leaves the excluded keys of
+    /// a class out of all references that its instances hold, whatever class they refer to, and the namespace too.
+    std::vector<std::string> FindReducedReferences(const ICIMClass& cls) const;
+
     /// In the order of the elements that they are about, then of their lines.
     const std::vector<TWarning>& GetWarnings() const { return fWarnings; }
 
@@ -56,6 +60,7 @@ class TRuleTrace {
     void WarnOfOverruled(std::size_t index);
     void CheckNames(std::size_t index);
     void CheckKeys(std::size_t index, const boost::shared_ptr<ICIMClass>& cls);
+    void WarnOfReducedReferences();
     void Warn(std::size_t index, unsigned int line, const std::string& text);
 
     TDecision MakeDefault(std::size_t index) const;
