@@ -4,6 +4,8 @@
 #include <set>
 #include <string_view>
 
+#include "client/text/DisplayText.h"
+
 namespace NORVZEL20 {
 
 namespace {
@@ -54,12 +56,12 @@ std::vector<std::string> MakeInventoryLabels(const std::vector<std::string>& pat
 {
     std::vector<std::string> labels;
     for (const std::string& path : paths) {
-        labels.push_back(ShortName(path));
+        labels.push_back(EscapeForDisplay(ShortName(path)));
     }
     const std::map<std::string, int> count = CountOf(labels);
     for (std::size_t i = 0; i < labels.size(); ++i) {
         if (count.at(labels[i]) > 1) {
-            labels[i] = paths[i];
+            labels[i] = EscapeForDisplay(paths[i]);
         }
     }
     // A file may itself be called "a#2", so a number is skipped if its label is taken.

@@ -152,7 +152,7 @@ std::string TTextFormat::Labels(const std::vector<std::size_t>& inventories) con
 {
     std::vector<std::string> labels;
     for (const std::size_t inventory : inventories) {
-        labels.push_back(EscapeForDisplay(fReport.labels[inventory]));
+        labels.push_back(DisplayLabel(fReport.labels[inventory]));
     }
     return boost::algorithm::join(labels, ", ");
 }

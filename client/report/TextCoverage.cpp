@@ -164,7 +164,7 @@ class TStatement {
         }
     }
 
-    std::string Label(std::size_t inventory) const { return EscapeForDisplay(fReport.labels[inventory]); }
+    std::string Label(std::size_t inventory) const { return DisplayLabel(fReport.labels[inventory]); }
 
     const TComparisonReport& fReport;
     const TCoverage& fCoverage;

@@ -6,7 +6,7 @@
 //   other control characters below U+0080                  \x1b
 //   U+0080 to U+009F, which terminals take for escapes     \u009b
 //   marks of direction, line and paragraph separators      \u202e
-//   bytes that are not UTF-8                               \xff
+//   bytes that are not UTF-8, overlong forms included      \xff
 //
 // A value is also quoted if a reader could not otherwise see its beginning and end, or which of its backslashes are its own.
 #include "client/text/DisplayText.h"
@@ -18,7 +18,7 @@ namespace NORVZEL20 {
 namespace {
 
 // Control characters; the marks, embeddings, overrides and isolates of bidirectional text; the separators U+2028 and U+2029; the
-// byte order mark, which is invisible. An overlong form is judged by the character that it stands for.
+// byte order mark, which is invisible.
 bool IsUnsafe(char32_t code)
 {
     return code < 0x20 || (code >= 0x7F && code < 0xA0) || code == 0x061C || code == 0x200E || code == 0x200F ||
@@ -78,17 +78,32 @@ std::string EscapeForDisplay(std::string_view text)
     out.reserve(text.size());
     while (!text.empty()) {
         const TUtf8::TCharacter character = TUtf8::Decode(text);
-        if (character.length == 0) {
+        const bool isCharacter = character.length > 0 && !character.IsOverlong() && character.IsScalar();
+        if (!isCharacter) {
             out += "\\x";
-            AppendHex(out, character.code, 2);
+            AppendHex(out, static_cast<unsigned char>(text.front()), 2);
         } else if (IsUnsafe(character.code)) {
             AppendEscape(out, character.code);
         } else {
             out += text.substr(0, character.length);
         }
-        text.remove_prefix(character.length == 0 ? 1 : character.length);
+        text.remove_prefix(isCharacter ? character.length : 1);
     }
     return out;
+}
+
+std::string DisplayLabel(std::string_view label)
+{
+    const bool needsQuotes = label.empty() || label.find_first_of(" \"") != std::string_view::npos ||
+                             std::string_view(",:;.").find(label.back()) != std::string_view::npos;
+    if (!needsQuotes) {
+        return EscapeForDisplay(label);
+    }
+    std::string quoted;
+    for (const char character : label) {
+        quoted += character == '"' ? "\\\"" : std::string(1, character);
+    }
+    return '"' + EscapeForDisplay(quoted) + '"';
 }
 
 std::string DisplayValue(const TCIMValue& value)

@@ -11,6 +11,11 @@ namespace NORVZEL20 {
 /// of writing or end a line, and bytes that are not UTF-8 become escapes (\n, \t, \x1b, \u202e). Everything else stays.
 std::string EscapeForDisplay(std::string_view text);
 
+/// The label of an inventory (see MakeInventoryLabels) as a part of a sentence or a list. A label is put in double quotes if it
+/// holds a blank or a quote or ends in a punctuation mark, because the text around it could then be taken for a part of it. Within
+/// the quotes a backslash stands before each quote. Different labels stay different.
+std::string DisplayLabel(std::string_view label);
+
 /// A value for people, in one line; NULL for null. Text is put in double quotes if it is empty, begins or ends with a blank, reads
 /// NULL, or holds a quote, a backslash, a character that EscapeForDisplay replaces, or " -> " or " / ", which reports use between
 /// values. Within the quotes a backslash stands before each quote and backslash. Other text is shown as it is.

@@ -31,9 +31,30 @@ TEST(EscapeForDisplay, ShowsWhatWouldActOnATerminal)
         {"\xc3", "\\xc3"},
         {"\xc3(", "\\xc3("},
         {"\xe2\x82", "\\xe2\\x82"},
+        {"\xe0\x80\x9b", "\\xe0\\x80\\x9b"},           // ESC, overlong
+        {"\xed\xa0\x80", "\\xed\\xa0\\x80"},           // a surrogate
+        {"\xf4\x90\x80\x80", "\\xf4\\x90\\x80\\x80"},  // above the last character
     };
     for (const auto& row : rows) {
         EXPECT_EQ(row.shown, EscapeForDisplay(row.text));
+    }
+}
+
+TEST(DisplayLabel, IsQuotedIfItCouldBeTakenForSeveral)
+{
+    const struct {
+        const char* label;
+        const char* shown;
+    } rows[] = {
+        {"web01", "web01"},         {"old/web01.xml#2", "old/web01.xml#2"},
+        {"caf\\xe9", "caf\\xe9"},   {"a,b", "a,b"},
+        {"a, b", "\"a, b\""},       {"a and b", "\"a and b\""},
+        {"web 01", "\"web 01\""},   {"a,", "\"a,\""},
+        {"a:", "\"a:\""},           {"a.", "\"a.\""},
+        {"\"a\"", "\"\\\"a\\\"\""}, {"", "\"\""},
+    };
+    for (const auto& row : rows) {
+        EXPECT_EQ(row.shown, DisplayLabel(row.label));
     }
 }
 
