@@ -15,7 +15,7 @@ class CIMDELTA_EXPORT TZELException : public std::exception {
     TZELException& operator=(const TZELException& other) noexcept = default;
     ~TZELException() noexcept override;
 
-    /// The text of the status.
+    /// The text of the status. Allocates nothing.
     const char* what() const noexcept override;
 
     TZELStatusCode GetStatusCode() const noexcept { return fStatusCode; }

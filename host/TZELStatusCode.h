@@ -37,6 +37,7 @@ class CIMDELTA_EXPORT TZELStatusCode {
     bool operator!=(const TZELStatusCode& other) const noexcept { return fStatus != other.fStatus; }
 
     /// The host's text for the status. Valid until the process ends. All numbers without a name above share one text.
+    /// Allocates nothing: the texts are made when the library is loaded.
     const std::string& TranslateStatusCode() const;
 
   private:

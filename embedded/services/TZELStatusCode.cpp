@@ -36,6 +36,9 @@ const TStatusText* GetTexts()
     return fgTexts;
 }
 
+// The texts are made while the library is loaded: an exception is asked for its text when there may be no memory left.
+[[maybe_unused]] const bool kMade = (GetTexts(), true);
+
 }  // namespace
 
 const std::string& TZELStatusCode::TranslateStatusCode() const

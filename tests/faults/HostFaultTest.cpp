@@ -51,7 +51,6 @@ class TFailingHostFixture : public testing::TestWithParam<TDiffering> {
   protected:
     void SetUp() override
     {
-        RunUntouched({GetParam().host, 2, true, EFlaw::kUnknownProperty});  // makes what is made once in the process
         fUntouched = RunUntouched(GetParam());
         TPrepared watched(GetParam());
         ASSERT_EQ("", watched.Run());

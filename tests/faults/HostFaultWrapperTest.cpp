@@ -30,7 +30,6 @@ class TFailingHostOfWrappersFixture : public testing::TestWithParam<EHost> {
 
     void FailEachCall(EStatus status)
     {
-        FailCall(0, status);  // what is made once in the process is made by now
         std::size_t call = 0;
         bool hasFailed = true;
         while (!HasFailure() && hasFailed) {

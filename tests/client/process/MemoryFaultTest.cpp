@@ -14,7 +14,6 @@
 #include "client/files/TUnfinishedFile.h"
 #include "client/process/LackOfMemory.h"
 #include "client/process/TStandardConsole.h"
-#include "host/TZELException.h"
 #include "tests/faults/FailEachAllocation.h"
 
 namespace NORVZEL20 {
@@ -122,12 +121,7 @@ std::string RunInProcess(const std::vector<const char*>& arguments, std::size_t 
 
 class MemoryFaultTest : public testing::TestWithParam<EMode> {
   protected:
-    void SetUp() override
-    {
-        ASSERT_EQ(0, chdir(CIMDELTA_CLIENT_TEST_DATA));
-        // The host makes its texts when the first one is needed; do that while there is memory.
-        ASSERT_STREQ("Out of memory", TZELException(TZELStatusCode::kOutOfMemory).what());
-    }
+    void SetUp() override { ASSERT_EQ(0, chdir(CIMDELTA_CLIENT_TEST_DATA)); }
 
     /// Fails every seventh allocation of the command's main thread, each in a process of its own, since the process may terminate.
     static void Spend(const std::vector<const char*>& arguments)
