@@ -17,8 +17,8 @@ class CIMDELTA_EXPORT INamespaceProvider {
   public:
     virtual ~INamespaceProvider() = default;
 
-    /// The name that the provider is registered under. Valid while the provider's library is loaded, but not in handlers that run
-    /// when the process exits: one of them may already have destroyed it.
+    /// The name that the provider is registered under; the manager keeps a copy. Valid while the provider's library is loaded, but
+    /// not in handlers that run when the process exits: one of them may already have destroyed it.
     virtual const std::string& GetName(TCallContext context) const = 0;
 
     /// A new namespace with the name `name`, such as "root/cimv2". Each provider defines what the flag means.

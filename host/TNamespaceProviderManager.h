@@ -18,7 +18,7 @@ class CIMDELTA_EXPORT TNamespaceProviderManager : public INamespaceProviderManag
     /// Never null.
     static boost::shared_ptr<TNamespaceProviderManager> GetInstance();
 
-    /// Also returns kInvalidParameter (5) for null.
+    /// Also returns kInvalidParameter (5) for null. The provider is asked for its name here and never again.
     TZELStatusCode RegisterProvider(boost::shared_ptr<INamespaceProvider> provider) override;
 
     /// The provider that is registered under exactly this name, letter case included; null if there is none.
@@ -28,10 +28,15 @@ class CIMDELTA_EXPORT TNamespaceProviderManager : public INamespaceProviderManag
     std::vector<std::string> GetProviderNames() const;
 
   private:
+    struct TEntry {
+        std::string name;  ///< as it was at the registration
+        boost::shared_ptr<INamespaceProvider> provider;
+    };
+
     TNamespaceProviderManager() = default;
 
     mutable std::mutex fMutex;
-    std::vector<boost::shared_ptr<INamespaceProvider>> fProviders;
+    std::vector<TEntry> fEntries;
 };
 
 }  // namespace NORVZEL20

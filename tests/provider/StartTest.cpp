@@ -36,13 +36,33 @@ TOperation Original(const char* symbol)
 
 // The arguments of an explicit instantiation may name private members. A test sets the process's only registry in this way.
 using TProviders = std::vector<boost::shared_ptr<INamespaceProvider>>;
-TProviders& ProvidersOf(TNamespaceProviderManager& manager);
+TProviders ProvidersOf(const TNamespaceProviderManager& manager);
+void Replace(TNamespaceProviderManager& manager, const TProviders& providers);
 
-template <TProviders TNamespaceProviderManager::*Member>
+template <class TEntries, TEntries TNamespaceProviderManager::*kEntries>
 struct TRegistryAccess {
-    friend TProviders& ProvidersOf(TNamespaceProviderManager& manager) { return manager.*Member; }
+    static TProviders Get(const TNamespaceProviderManager& manager)
+    {
+        TProviders providers;
+        for (const auto& entry : manager.*kEntries) {
+            providers.push_back(entry.provider);
+        }
+        return providers;
+    }
+    static void Set(TNamespaceProviderManager& manager, const TProviders& providers)
+    {
+        (manager.*kEntries).clear();
+        for (const auto& provider : providers) {
+            (manager.*kEntries).push_back({provider->GetName(TCallContext()), provider});
+        }
+    }
+    friend TProviders ProvidersOf(const TNamespaceProviderManager& manager) { return TRegistryAccess::Get(manager); }
+    friend void Replace(TNamespaceProviderManager& manager, const TProviders& providers)
+    {
+        TRegistryAccess::Set(manager, providers);
+    }
 };
-template struct TRegistryAccess<&TNamespaceProviderManager::fProviders>;
+template struct TRegistryAccess<std::vector<TNamespaceProviderManager::TEntry>, &TNamespaceProviderManager::fEntries>;
 
 // Answers like the provider "inmem" and records the calls.
 class TTellingProvider : public INamespaceProvider {
@@ -120,22 +140,22 @@ namespace {
 
 class StartTest : public testing::Test {
   protected:
-    StartTest() : fProvider(new TTellingProvider), fRegistered(Registry())
+    StartTest() : fProvider(new TTellingProvider), fRegistered(ProvidersOf(Manager()))
     {
         gCalls = &fCalls;
-        Registry() = {fProvider};
+        Replace(Manager(), {fProvider});
     }
     ~StartTest() override
     {
         gIsManagerMissing = false;
         gRegistrationStatus = 0;
-        Registry() = fRegistered;
+        Replace(Manager(), fRegistered);
         gPopulationStatus = 0;
         gAllocationStatus = 0;
         gIsStoreNull = false;
     }
 
-    static TProviders& Registry() { return ProvidersOf(*TNamespaceProviderManager::GetInstance()); }
+    static TNamespaceProviderManager& Manager() { return *TNamespaceProviderManager::GetInstance(); }
 
     std::string CallsWithRoot(const char* root)
     {
@@ -175,7 +195,7 @@ TEST_F(StartTest, AFailureOfThePopulatorLeavesTheAllocation)
 
 TEST_F(StartTest, AFailureOfThePopulatorLeavesNothingBehind)
 {
-    const TProviders before = Registry();
+    const TProviders before = ProvidersOf(Manager());
     gPopulationStatus = TZELStatusCode::kParseError;
     EXPECT_EQ(9, StatusOf([&] { CallsWithRoot("/opt/x"); }));
     EXPECT_EQ("AllocateNamespace {} false \"root/cimv2\"\n"
@@ -183,7 +203,7 @@ TEST_F(StartTest, AFailureOfThePopulatorLeavesNothingBehind)
               "PopulateFromXMLFile store /opt/x/data/deltaclasses.properties.xml\n",
               fCalls);
     EXPECT_TRUE(fProvider->IsStoreGone());
-    EXPECT_EQ(before, Registry());
+    EXPECT_EQ(before, ProvidersOf(Manager()));
 }
 
 TEST_F(StartTest, AFailureOfTheStoreProviderLeavesTheAllocation)
@@ -204,7 +224,7 @@ TEST_F(StartTest, AStoreProviderThatAnswersNullLeavesItToThePopulator)
 
 TEST_F(StartTest, AMissingStoreProviderFailsTheAssertion)
 {
-    Registry().clear();
+    Replace(Manager(), {});
     EXPECT_TRUE(FailsOnNull([&] { CallsWithRoot("/opt/x"); }));
 }
 

@@ -20,6 +20,7 @@
 namespace NORVZEL20 {
 namespace {
 
+using testing::Contains;
 using testing::EndsWith;
 using testing::HasSubstr;
 
@@ -124,6 +125,31 @@ TEST(ProviderManagerTest, ASecondProviderOfANameIsRefusedAndTheFirstStays)
     EXPECT_EQ(first, manager->FindProvider("twice"));
     EXPECT_EQ(nullptr, manager->FindProvider("Twice")) << "names are compared byte for byte";
     EXPECT_EQ("twice", manager->GetProviderNames().back());
+}
+
+TEST(ProviderManagerTest, AProviderIsAskedForItsNameOnlyWhenItRegisters)
+{
+    const auto manager = TNamespaceProviderManager::GetInstance();
+    const auto first = boost::make_shared<TNamedProvider>("asked once");
+    const auto second = boost::make_shared<TNamedProvider>("asked once");
+    manager->RegisterProvider(first);
+    manager->RegisterProvider(second);
+    manager->RegisterProvider(boost::make_shared<TNamedProvider>("another"));
+    EXPECT_EQ(first, manager->FindProvider("asked once"));
+    EXPECT_THAT(manager->GetProviderNames(), Contains("asked once"));
+    EXPECT_EQ(1, first->GetQuestionCount());
+    EXPECT_EQ(1, second->GetQuestionCount());
+}
+
+TEST(ProviderManagerTest, TheNameAtTheRegistrationStays)
+{
+    const auto manager = TNamespaceProviderManager::GetInstance();
+    const auto provider = boost::make_shared<TNamedProvider>("at first");
+    manager->RegisterProvider(provider);
+    provider->Rename("at last");
+    EXPECT_EQ(provider, manager->FindProvider("at first"));
+    EXPECT_EQ(nullptr, manager->FindProvider("at last"));
+    EXPECT_EQ("at first", manager->GetProviderNames().back());
 }
 
 TEST(ProviderManagerTest, ANullProviderIsRefused)
