@@ -2,8 +2,10 @@
 
 #include <boost/smart_ptr/shared_ptr.hpp>
 #include <cstdint>
+#include <ios>
 #include <string>
 #include <string_view>
+#include <type_traits>
 #include <vector>
 
 #include "host/Export.h"
@@ -178,5 +180,11 @@ class CIMDELTA_EXPORT alignas(8) TCIMValue {
     unsigned char fForm;
     unsigned char fBytes[14];  // the contents; their layout depends on fForm
 };
+
+/// A value is not written to a stream: that would convert it to a number, which throws for most values. Write its ToText.
+template <class TStream, class TValue,
+          class = std::enable_if_t<std::conjunction_v<std::is_same<TValue, TCIMValue>,
+                                                      std::is_base_of<std::ios_base, std::remove_reference_t<TStream>>>>>
+TStream&& operator<<(TStream&& stream, const TValue& value) = delete;
 
 }  // namespace NORVZEL20
