@@ -1,6 +1,7 @@
 #include "spec/TDiffClassRules.h"
 
 #include <algorithm>
+#include <locale>
 #include <sstream>
 #include <utility>
 
@@ -25,6 +26,7 @@ void TCIMDiffEngine::TDiffClassRules::excludeKeys(std::string list)
 {
     std::istringstream words(list);
     words.exceptions(std::ios_base::badbit);  // otherwise a lack of memory would look like the end of the list
+    words.imbue(std::locale::classic());      // the process's locale may take other characters for white space
     for (std::string word; words >> word;) {
         fExcludedKeys.push_back(word);
     }

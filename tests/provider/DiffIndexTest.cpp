@@ -3,6 +3,7 @@
 #include <locale>
 
 #include "tests/provider/TDeltaFixture.h"
+#include "tests/support/TOddLocale.h"
 #include "tests/support/TTestAccess.h"
 
 namespace NORVZEL20 {
@@ -44,7 +45,7 @@ TEST_F(DiffIndexTest, APositionBehindTheLastIsPrintedAndRefused)
 // Changes how standard output writes numbers, and restores it at the end.
 class TOddOutput {
   public:
-    TOddOutput() : fFormat(nullptr), fLocale(std::cout.imbue(std::locale(std::locale::classic(), new TGrouping)))
+    TOddOutput() : fFormat(nullptr), fLocale(std::cout.imbue(TOddLocale::Make()))
     {
         fFormat.copyfmt(std::cout);
         std::cout << std::hex << std::showbase << std::showpos << std::uppercase << std::left << std::setfill('*') << std::setw(40);
@@ -58,12 +59,6 @@ class TOddOutput {
     }
 
   private:
-    // Separates thousands, like some locales.
-    struct TGrouping : std::numpunct<char> {
-        char do_thousands_sep() const override { return ','; }
-        std::string do_grouping() const override { return "\3"; }
-    };
-
     std::ios fFormat;
     std::locale fLocale;
 };
@@ -119,11 +114,11 @@ TEST_F(DiffIndexTest, TheIndexIsHeldAgainstTheNumberCutToSixteenBits)
     EXPECT_EQ("status 15|Bad nsIndex, nsIndex=1\n", Ask(At(1)));
 }
 
-TEST_F(DiffIndexTest, TheCallersContextIsLeftAsItWas)
+TEST_F(DiffIndexTest, NoNamespaceIsAsked)
 {
-    const TCallContext context = At(1);
-    Delta().GetDiffIndex(context);
-    EXPECT_EQ(1u, context.size());
+    EXPECT_EQ("1|", Ask(At(1)));
+    EXPECT_EQ("status 15|Bad nsIndex, nsIndex=3\n", Ask(At(3)));
+    EXPECT_EQ("status 38|", Ask(TCallContext()));
     EXPECT_EQ("", Watch().TakeText());
 }
 

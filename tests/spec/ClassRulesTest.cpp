@@ -8,6 +8,7 @@
 #include "tests/spec/PropertyRules.h"
 #include "tests/support/Dump.h"
 #include "tests/support/TCapturingLogger.h"
+#include "tests/support/TOddLocale.h"
 
 namespace NORVZEL20 {
 namespace {
@@ -50,6 +51,14 @@ TEST(ClassRulesTest, UpdateTakesDefaultAndListedPropertiesAlone)
     EXPECT_EQ("exclude final A:INCLUDE B:EXCLUDE C:INCLUDE -K\n", DumpRules(rules));
     EXPECT_EQ("Disk", rules.fClassName);
     EXPECT_EQ("exclude B:EXCLUDE C:INCLUDE -L\n", DumpRules(*other));
+}
+
+TEST(ClassRulesTest, ExcludedKeysAreSeparatedAlikeInEveryLocale)
+{
+    const TOddLocale odd;
+    TRules rules;
+    rules.excludeKeys("A;B \tC;");
+    EXPECT_EQ("exclude -A;B -C;\n", DumpRules(rules));
 }
 
 TEST(ClassRulesTest, UpdateWithNothingFailsTheAssertion)

@@ -6,6 +6,8 @@
 #include "host/TZELException.h"
 #include "spec/TDiffXMLParser.h"
 #include "tests/spec/TSpecFixture.h"
+#include "tests/support/TOddLocale.h"
+#include "tests/support/watched/TWatchedClass.h"
 #include "tests/support/watched/TWatchedNamespace.h"
 
 namespace NORVZEL20 {
@@ -187,6 +189,17 @@ TEST_P(SpecErrorsTest, TheFullTextOfAnErrorOnLineTwelve)
                   TextOf(TZELStatusCode::kParseError) + " on line 12|",
               log);
     EXPECT_EQ(std::string::npos, log.find("Previous error"));
+}
+
+TEST_P(SpecErrorsTest, LinesAreWrittenAlikeInEveryLocale)
+{
+    const TOddLocale odd;
+    const std::string lines(1233, '\n');
+    const TBadSpec bad{lines + "<DifftoolSpec><class name=\"Nowhere\"/></DifftoolSpec>", 1234, kNoClass};
+    EXPECT_EQ("status 9", Read(bad.document));
+    EXPECT_EQ(BothEntries(bad), TakeLog());
+    EXPECT_EQ("status 9", Read(lines));
+    EXPECT_EQ("0|Diff-XML Parser line 1234:no element found|", TakeLog());
 }
 
 TEST_P(SpecErrorsTest, AnotherFailureOfTheClassLookUpKeepsItsStatus)
