@@ -86,6 +86,10 @@ const std::vector<TBadSpec> kBadClasses = {
     {"<DifftoolSpec>\n<class default=\"includes\"/>\n</DifftoolSpec>", 2, kDefault},
     {"<DifftoolSpec>\n<class zoo=\"\" default=\"x\"/>\n</DifftoolSpec>", 2, kDefault},
     {"<DifftoolSpec>\n<class aaa=\"\" default=\"x\"/>\n</DifftoolSpec>", 2, kParameter},
+    {"<DifftoolSpec>\n<class default=\"x\" Zoo=\"\"/>\n</DifftoolSpec>", 2, kParameter},
+    {"<DifftoolSpec>\n<class default=\"x\" d=\"\"/>\n</DifftoolSpec>", 2, kParameter},
+    {"<DifftoolSpec>\n<class \xC3\xA4=\"\" default=\"x\"/>\n</DifftoolSpec>", 2, kDefault},
+    {"<DifftoolSpec>\n<class default.=\"\" default=\"x\"/>\n</DifftoolSpec>", 2, kDefault},
     {"<DifftoolSpec>\n<class name=\"Nowhere\" zoo=\"\"/>\n</DifftoolSpec>", 2, kParameter},
     {"<DifftoolSpec>\n<class/>\n</DifftoolSpec>", 2, kNoName},
     {"<DifftoolSpec>\n<class name=\"\"/>\n</DifftoolSpec>", 2, kNoName},
@@ -331,6 +335,36 @@ TEST_P(SpecErrorsTest, ANullClassFailsTheAssertionWhereItIsAskedForMore)
         EXPECT_EQ(0u, log.find("0|Assertion failed: px != 0")) << answers;
         EXPECT_EQ(std::string::npos, log.find("exception in")) << answers;
     }
+}
+
+// A schema whose class Other returns a null pointer for every declaration of a property.
+class TUndeclaringSchema : public TWatchedNamespace {
+  public:
+    explicit TUndeclaringSchema(boost::shared_ptr<ICIMNamespace> ns)
+        : TWatchedNamespace(ns, boost::make_shared<TCallWatch>(), "undeclaring")
+    {}
+
+    boost::shared_ptr<ICIMClass> GetClass(const std::string& name, TCallContext context) override
+    {
+        return boost::make_shared<TUndeclaringClass>(TWatchedNamespace::GetClass(name, context));
+    }
+
+  private:
+    class TUndeclaringClass : public TWatchedClass {
+      public:
+        explicit TUndeclaringClass(boost::shared_ptr<ICIMClass> cls)
+            : TWatchedClass(cls, boost::make_shared<TCallWatch>(), "undeclaring")
+        {}
+
+        boost::shared_ptr<ICIMPropertyDecl> GetPropertyDecl(const std::string&, TCallContext) const override { return nullptr; }
+    };
+};
+
+TEST_P(SpecErrorsTest, OnlyAnExceptionMakesAPropertyInvalid)
+{
+    fNamespaces[0] = boost::make_shared<TUndeclaringSchema>(fComparison.Namespace(0).GetNamespace());
+    EXPECT_EQ("Other exclude Z:INCLUDE\n", Read(InValue("Z")));
+    EXPECT_EQ("", TakeLog());
 }
 
 TEST_P(SpecErrorsTest, AFailureOfThePushDownKeepsItsStatus)

@@ -10,6 +10,7 @@
 #include <optional>
 #include <stdexcept>
 #include <typeinfo>
+#include <vector>
 
 #include "host/TOSSpecific.h"
 #include "host/TZELException.h"
@@ -24,12 +25,14 @@ namespace {
 std::optional<std::uint64_t> gFileSize;  // what the host shall say of any file
 std::exception_ptr gSizeFailure;         // what the host shall throw instead
 bool gIsMemoryShort = false;
+std::vector<std::size_t> gBuffers;  // the sizes that were asked for
 
 }  // namespace
 
 // The form of new[] that returns a null pointer if there is no memory.
 void* operator new[](std::size_t size, const std::nothrow_t&) noexcept
 {
+    gBuffers.push_back(size);
     if (gIsMemoryShort) {
         return nullptr;
     }
@@ -181,6 +184,19 @@ TEST_F(SpecFileLoadingTest, TheParserGetsTheFilesBytesAndNoMore)
     EXPECT_EQ("", Read("<DifftoolSpec/>"));
     EXPECT_EQ("status 9", Read(std::string("<DifftoolSpec/>\0", 16)));
     EXPECT_EQ("status 9", Read(std::string("<DifftoolSpec/>\0<x/>", 20)));
+}
+
+TEST_F(SpecFileLoadingTest, TheBufferHasTheFilesSizeToTheByte)
+{
+    for (const std::size_t blanks : {0u, 1u, 4096u}) {
+        const std::string document = "<DifftoolSpec/>" + std::string(blanks, ' ');
+        gBuffers.clear();
+        EXPECT_EQ("", Read(document));
+        EXPECT_EQ(std::vector<std::size_t>{document.size()}, gBuffers);
+    }
+    gBuffers.clear();
+    EXPECT_EQ("status 9", Read(""));
+    EXPECT_EQ(std::vector<std::size_t>{0}, gBuffers);
 }
 
 TEST_F(SpecFileLoadingTest, AFileThatShrankIsReadAsItIs)
