@@ -152,6 +152,31 @@ TEST_F(InstanceComparisonTest, ANullReferenceDiffersFromOneThatIsThere)
     EXPECT_EQ("", Compare("Owner", null, null));
 }
 
+TEST_F(InstanceComparisonTest, NullsAreEqualWhateverTheirTypes)
+{
+    const TCIMValue reference = TCIMValue::Null(TCIMValue::TCIMType::kReference);
+    const TCIMValue text = TCIMValue::Null(TCIMValue::TCIMType::kString);
+    for (const TCIMValue& other : {TCIMValue(), text}) {
+        EXPECT_EQ("", Compare("Owner", reference, other));
+        EXPECT_EQ("", Compare("Owner", other, reference));
+    }
+    EXPECT_EQ("", Compare("Id", text, TCIMValue()));
+    EXPECT_EQ("k Owner 1\n", Compare("Owner", PathTo("", 1, "a"), TCIMValue()));
+}
+
+TEST_F(InstanceComparisonTest, AChangeThatFailsLeavesItsEntryAndEndsTheComparison)
+{
+    fRules = RulesWithout("Bus");
+    fProperties = {"Size", "Id"};
+    const auto master = Disk(0, {{"Id", "a"}, {"Bus", 1u}, {"Size", 1u}});
+    const auto other = Disk(1, {{"Id", "b"}, {"Bus", 2u}, {"Size", 2u}});
+    Watch().FailCallsOf("ns0:Disk.Bus=1,Id=\"a\".Size.MarkChanged(2)", TZELStatusCode::kNamespaceGone);
+    EXPECT_EQ("status 18", OutcomeOf([&] { Compare(master, other); }));
+    EXPECT_EQ("k Size 1\n", Text(fDifferences));
+    EXPECT_EQ("1", master->GetProperty("Size", fNone)->GetValue(fNone).ToText());
+    EXPECT_EQ("", DumpAliases(fComparison.Delta()));
+}
+
 TEST_F(InstanceComparisonTest, AReferenceAgainstAnotherTypeIsAnErrorOfTheHost)
 {
     EXPECT_EQ("status 13", OutcomeOf([&] { Compare("Owner", PathTo("", 1, "a"), TCIMValue("text")); }));

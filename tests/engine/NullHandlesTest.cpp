@@ -6,6 +6,7 @@
 #include "tests/engine/TPerClassFixture.h"
 #include "tests/support/watched/TWatchedClass.h"
 #include "tests/support/watched/TWatchedInstance.h"
+#include "tests/support/watched/TWatchedProperty.h"
 
 namespace NORVZEL20 {
 namespace {
@@ -42,16 +43,41 @@ class TSizelessInstance : public TWatchedInstance {
     }
 };
 
-class TClassOfSizelessInstances : public TWatchedClass {
+// A property without a declaration.
+class TUndeclaredProperty : public TWatchedProperty {
   public:
-    explicit TClassOfSizelessInstances(boost::shared_ptr<ICIMClass> cls)
-        : TWatchedClass(cls, boost::make_shared<TCallWatch>(), "sizeless")
+    explicit TUndeclaredProperty(boost::shared_ptr<ICIMProperty> property)
+        : TWatchedProperty(property, boost::make_shared<TCallWatch>(), "undeclared")
     {}
+
+    boost::shared_ptr<const ICIMPropertyDecl> GetPropertyDecl(TCallContext) const override { return nullptr; }
+};
+
+// An instance that enumerates properties without declarations.
+class TUndeclaredInstance : public TWatchedInstance {
+  public:
+    explicit TUndeclaredInstance(boost::shared_ptr<ICIMInstance> instance)
+        : TWatchedInstance(instance, boost::make_shared<TCallWatch>(), "undeclared", "undeclared")
+    {}
+
+    void EnumerateProperties(const boost::function<bool(boost::shared_ptr<ICIMProperty>)>& callback,
+                             TCallContext context) const override
+    {
+        const auto passOn = [&](auto property) { return callback(boost::make_shared<TUndeclaredProperty>(property)); };
+        GetWatched()->EnumerateProperties(passOn, context);
+    }
+};
+
+// A class whose instances come as objects of type TOddInstance.
+template <class TOddInstance>
+class TClassOf : public TWatchedClass {
+  public:
+    explicit TClassOf(boost::shared_ptr<ICIMClass> cls) : TWatchedClass(cls, boost::make_shared<TCallWatch>(), "odd") {}
 
     void EnumerateInstances(const boost::function<bool(boost::shared_ptr<ICIMInstance>)>& callback, bool deep,
                             TCallContext context) override
     {
-        const auto passOn = [&](auto instance) { return callback(boost::make_shared<TSizelessInstance>(instance)); };
+        const auto passOn = [&](auto instance) { return callback(boost::make_shared<TOddInstance>(instance)); };
         GetWatched()->EnumerateInstances(passOn, deep, context);
     }
 };
@@ -90,13 +116,21 @@ TEST_P(NullHandlesTest, AClassThatIsNullIsAskedForItsInstances)
 TEST_P(NullHandlesTest, APropertyThatIsNullIsAskedForItsValue)
 {
     Disk(0, "sda", 1);
-    EXPECT_EQ("", RecordsOfRunAgainst([](auto cls) { return boost::make_shared<TClassOfSizelessInstances>(cls); }));
+    EXPECT_EQ("", RecordsOfRunAgainst([](auto cls) { return boost::make_shared<TClassOf<TSizelessInstance>>(cls); }));
 }
 
 TEST_P(NullHandlesTest, AnInstanceThatVanishedIsRecordedAndEndsTheRunAtItsCopy)
 {
     EXPECT_EQ("Disk\n  2 Disk.Bus=0,Id=\"sda\" [1]\n",
               RecordsOfRunAgainst([](auto cls) { return boost::make_shared<TVanishingClass>(cls); }));
+    EXPECT_EQ(1u, fComparison.GetWatch().CountOf("ns0:Disk.AllocateInstance() {}"));
+    EXPECT_EQ("", Disks(0));
+}
+
+TEST_P(NullHandlesTest, ADeclarationThatIsNullIsAskedForItsNameAndEndsTheRunAtTheCopy)
+{
+    EXPECT_EQ("Disk\n  2 Disk.Bus=0,Id=\"sda\" [1]\n",
+              RecordsOfRunAgainst([](auto cls) { return boost::make_shared<TClassOf<TUndeclaredInstance>>(cls); }));
     EXPECT_EQ(1u, fComparison.GetWatch().CountOf("ns0:Disk.AllocateInstance() {}"));
     EXPECT_EQ("", Disks(0));
 }

@@ -1,7 +1,9 @@
 #include <boost/smart_ptr/make_shared.hpp>
+#include <stdexcept>
 #include <typeinfo>
 
 #include "host/TZELException.h"
+#include "tests/engine/TAnsweringNamespace.h"
 #include "tests/engine/TPerClassFixture.h"
 #include "tests/support/watched/TWatchedNamespace.h"
 
@@ -118,6 +120,48 @@ TEST_P(SchemaCheckTest, AnotherFailureIsThrownAnew)
         EXPECT_EQ(TZELStatusCode::kNamespaceGone, error.GetStatusCode().GetStatus());
         EXPECT_EQ(typeid(TZELException), typeid(error));
     }
+}
+
+// What the run throws if a compared namespace throws this at its class Card. Nothing is logged.
+template <class TFailure>
+std::string OutcomeOfRun(TComparisonRun& comparison, const TFailure& failure)
+{
+    const auto ns = comparison.Namespace(1).GetNamespace();
+    const auto answer = [&](const std::string& name) -> boost::shared_ptr<ICIMClass> {
+        if (name == "Card") {
+            throw failure;
+        }
+        return ns->GetClass(name, TCallContext());
+    };
+    comparison.Delta().AddNamespaceToCompareList(boost::make_shared<TAnsweringNamespace>(ns, answer));
+    try {
+        comparison.Delta().FindDifferences();
+    } catch (const std::out_of_range& error) {
+        return error.what();
+    } catch (int number) {
+        return std::to_string(number);
+    }
+    return "nothing";
+}
+
+TEST_P(SchemaCheckTest, WhatIsNoExceptionOfTheHostPassesAsItIs)
+{
+    Disk(0, "sda", 1);
+    Card(0);
+    Card(1);
+    fComparison.Prepare();
+    EXPECT_EQ("own", OutcomeOfRun(fComparison, std::out_of_range("own")));
+    EXPECT_EQ("Disk\n  1 Disk.Bus=0,Id=\"sda\" [1 2]\n", fComparison.Records());
+    EXPECT_EQ("", fLog.Take());
+}
+
+TEST_P(SchemaCheckTest, WhatIsNoExceptionAtAllPassesAsItIs)
+{
+    Card(0);
+    Card(1);
+    fComparison.Prepare();
+    EXPECT_EQ("5", OutcomeOfRun(fComparison, 5));
+    EXPECT_EQ("", fLog.Take());
 }
 
 TEST_P(SchemaCheckTest, AReferenceWithoutItsRootEndsTheRun)

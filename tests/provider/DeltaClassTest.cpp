@@ -7,6 +7,7 @@
 #include "tests/support/Dump.h"
 #include "tests/support/NoContext.h"
 #include "tests/support/TTestAccess.h"
+#include "tests/support/watched/TWatchedClass.h"
 
 namespace NORVZEL20 {
 namespace {
@@ -61,6 +62,24 @@ TEST_F(DeltaClassTest, TheSuperclassOfATopLevelClassFailsTheAssertion)
 {
     const auto base = Wrapper("Base", 1);
     EXPECT_TRUE(FailsOnNull([&] { base->GetSuperClass(At(1)); }));
+}
+
+// The compared namespace has KALMO_Delta too, above and below other classes.
+TEST_F(DeltaClassTest, AClassThatTheStoreHasTooIsTheStores)
+{
+    fComparison.Namespace(1).Class("KALMO_Delta", "Base", {}).Class("Special", "KALMO_Delta", {});
+    const auto own = TWatchedClass::Unwatched(Delta().GetClass("KALMO_Delta", kNoContext));
+    const auto special = Wrapper("Special", 1);
+    const auto above = special->GetSuperClass(At(1));
+    EXPECT_EQ("ns1:Special.GetSuperClass() {nsIndex=1}\n"
+              "ns1:KALMO_Delta.GetName() {nsIndex=1}\n"
+              "store.GetClass(\"KALMO_Delta\") {nsIndex=1}\n",
+              Watch().TakeText());
+    EXPECT_EQ(own, TWatchedClass::Unwatched(above));
+    EXPECT_EQ(own, TWatchedClass::Unwatched(special->GetSuperClass(kNoContext))) << "needs no index";
+    Wrapper("Base", 1)->EnumerateSubClasses(Collect(), false, At(1));
+    ASSERT_EQ(3u, fClasses.size());
+    EXPECT_EQ(own, TWatchedClass::Unwatched(fClasses[2]));
 }
 
 TEST_F(DeltaClassTest, SubclassesAreWrappers)
@@ -125,6 +144,15 @@ TEST_F(DeltaClassTest, TheWrappingCallbackAsksWithItsOwnCopyOfTheContext)
     EXPECT_EQ(Delta().GetClass("Sub", At(2)), fClasses[0]);
 }
 
+TEST_F(DeltaClassTest, ANullClassFailsTheAssertionOfTheWrappingCallback)
+{
+    const TClassCallback collect = Collect();
+    const TCallbackWrapClass wrap(fComparison.GetDelta(), &collect, At(2));
+    EXPECT_TRUE(FailsOnNull([&] { wrap(nullptr); }));
+    EXPECT_TRUE(fClasses.empty());
+    EXPECT_EQ("", Watch().TakeText());
+}
+
 TEST_F(DeltaClassTest, AncestryIsAskedOfTheWrappedClasses)
 {
     const auto base = Wrapper("Base", 1);
@@ -139,6 +167,13 @@ TEST_F(DeltaClassTest, AncestryOfAClassThatIsNoWrapperFailsTheAssertion)
     const auto sub = Wrapper("Sub", 1);
     const auto raw = fComparison.Namespace(1).GetNamespace()->GetClass("Base", kNoContext);
     EXPECT_TRUE(FailsOnNull([&] { sub->IsSubclassOf(raw, At(1)); }));
+}
+
+TEST_F(DeltaClassTest, AncestryOfANullClassFailsTheAssertion)
+{
+    const auto sub = Wrapper("Sub", 1);
+    EXPECT_TRUE(FailsOnNull([&] { sub->IsSubclassOf(nullptr, At(1)); }));
+    EXPECT_EQ("", Watch().TakeText());
 }
 
 TEST_F(DeltaClassTest, WrappersCompareByNameAlone)
@@ -174,10 +209,26 @@ TEST_F(DeltaClassTest, MethodsAreNotRun)
 
 TEST_F(DeltaClassTest, AssignmentCopiesNothing)
 {
+    const auto sub = Wrapper("Sub", 1);
+    TCIMReference path;
+    path.SetClassName("Own");
+    sub->AddObjectPathAlias("own", path);
+    // Another wrapper, without a namespace, with an alias.
+    TDeltaClass other(nullptr, fComparison.Watched(0)->GetClass("Twin", kNoContext));
+    other.AddObjectPathAlias("other", path);
+
+    ICIMClass& target = *sub;
+    EXPECT_EQ(&target, &(target = static_cast<const ICIMClass&>(other)));
+    EXPECT_EQ(sub.get(), &(*sub = static_cast<const TDeltaClass&>(other)));
+    EXPECT_EQ("Sub", sub->GetName(kNoContext));
+    EXPECT_EQ(Delta().GetClass("Base", At(1)), sub->GetSuperClass(At(1)));
+    EXPECT_EQ("1:Sub own -> Own\n", DumpAliases(Delta()));
+}
+
+TEST_F(DeltaClassTest, AWrapperKnowsItsOwner)
+{
     const auto base = Wrapper("Base", 1);
-    ICIMClass& target = *base;
-    EXPECT_EQ(&target, &(target = static_cast<const ICIMClass&>(*Wrapper("Sub", 0))));
-    EXPECT_EQ("Base", base->GetName(kNoContext));
+    EXPECT_EQ(base, base->shared_from_this());
 }
 
 TEST_F(DeltaClassTest, ClearInstancesLeavesTheInstances)

@@ -156,16 +156,30 @@ TEST(LifecycleTest, TheStoreIsReleasedFirstThenTheComparedNamespacesThenTheWrapp
     EXPECT_EQ("store compared class ", ends);
 }
 
+// What a namespace has: its specification, the number of namespaces, the number of maps of wrappers, and whether it has a store.
+std::string StateOf(const TDeltaNamespace& ns)
+{
+    return TTestAccess::SpecFileName(ns) + " " + std::to_string(TTestAccess::CompareList(ns).size()) + " " +
+           std::to_string(TTestAccess::ClassCache(ns).size()) + (TTestAccess::Store(ns) ? " store" : "");
+}
+
 TEST(LifecycleTest, AssignmentCopiesNothing)
 {
-    const auto delta = WithoutStore();
-    const auto other = WithoutStore();
-    other->SetSpecFileName("rules.xml");
-    other->AddNamespaceToCompareList(nullptr);
-    ICIMNamespace& target = *delta;
-    EXPECT_EQ(&target, &(target = static_cast<ICIMNamespace&>(*other)));
-    EXPECT_EQ("", TTestAccess::SpecFileName(*delta));
-    EXPECT_EQ(0, delta->NumContainers());
+    const auto full = MakeDeltaNamespace(EHost::kPlain);
+    full->SetSpecFileName("rules.xml");
+    full->AddNamespaceToCompareList(MakeNamespace(EHost::kPlain, "compared"));
+    const auto bare = WithoutStore();
+    bare->SetSpecFileName("own.xml");
+    ASSERT_EQ("rules.xml 1 1 store", StateOf(*full));
+    ASSERT_EQ("own.xml 0 0", StateOf(*bare));
+
+    ICIMNamespace& target = *bare;
+    EXPECT_EQ(&target, &(target = static_cast<ICIMNamespace&>(*full)));
+    EXPECT_EQ("own.xml 0 0", StateOf(*bare));
+    EXPECT_EQ(bare.get(), &(*bare = static_cast<const TDeltaNamespace&>(*full)));
+    EXPECT_EQ("own.xml 0 0", StateOf(*bare));
+    *full = static_cast<const TDeltaNamespace&>(*bare);
+    EXPECT_EQ("rules.xml 1 1 store", StateOf(*full));
 }
 
 TEST(LifecycleTest, InitializeDoesNothing)
