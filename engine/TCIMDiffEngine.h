@@ -95,6 +95,11 @@ class CIMDELTA_INTERNAL_EXPORT TCIMDiffEngine {
                  boost::shared_ptr<ICIMInstance> other, std::string key, std::vector<std::string>& properties,
                  std::map<std::string, std::map<std::string, std::vector<int>>>& differences, unsigned int namespaceIndex);
 
+    /// Whether two values of a property differ: references by the texts of their paths (see buildPath), all other values by
+    /// TCIMValue::operator==. The type is that of `master`, the reference's value.
+    /// Errors: kTypeMismatch (13) if `master` is a path and `other` has another type and is not null.
+    bool IsDifferent(boost::shared_ptr<TDiffClassRules> rules, const TCIMValue& master, const TCIMValue& other);
+
     /// The names of the properties to compare. If the default is to exclude: the included properties, in ascending order. If it is
     /// to include: all properties of the class in the class's order, without the excluded ones and DateTimeOfCollection.
     std::vector<std::string> buildPropList(boost::shared_ptr<TDiffClassRules> rules, boost::shared_ptr<ICIMClass> cls);
@@ -139,7 +144,6 @@ class CIMDELTA_INTERNAL_EXPORT TCIMDiffEngine {
     void CheckOperatingSystems();
     void CompareSubClasses(ICIMClass& cls);
     void AliasInstance(ICIMInstance& instance, const std::string& key, unsigned int namespaceIndex);
-    bool IsDifferent(boost::shared_ptr<TDiffClassRules> rules, const TCIMValue& master, const TCIMValue& other);
     boost::shared_ptr<ICIMInstance> AllocateRecord(const std::string& className);
     static void SetProperty(ICIMInstance& instance, const std::string& name, const TCIMValue& value);
 

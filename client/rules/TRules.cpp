@@ -29,6 +29,15 @@ std::string TRules::KeyOf(const std::string& className, const boost::shared_ptr<
     return fEngine.buildPath(Find(className), instance);
 }
 
+bool TRules::Differ(const std::string& className, const TCIMValue& reference, const TCIMValue& other)
+{
+    // The engine refuses to compare a reference with a value of another type.
+    if (reference.GetType() != other.GetType()) {
+        return !reference.IsNull() || !other.IsNull();
+    }
+    return fEngine.IsDifferent(Find(className), reference, other);
+}
+
 const std::vector<std::string>& TRules::ExcludedKeysOf(const std::string& className)
 {
     return Find(className)->fExcludedKeys;

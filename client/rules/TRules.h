@@ -28,6 +28,10 @@ class TRules {
     /// The key under which an instance of class `className` is matched.
     std::string KeyOf(const std::string& className, const boost::shared_ptr<ICIMInstance>& instance);
 
+    /// Whether the engine takes two values of a property of class `className` for different. The first one stands in the place of
+    /// the reference's: if it is a bag, the order of the elements does not count.
+    bool Differ(const std::string& className, const TCIMValue& reference, const TCIMValue& other);
+
     /// The class's excluded keys, in the order of the rules.
     const std::vector<std::string>& ExcludedKeysOf(const std::string& className);
 
