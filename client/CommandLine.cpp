@@ -135,14 +135,19 @@ class TCommandLine {
         AddText(command, "--output", output, "write the result to this file, whole or not at all")->option_text("FILE");
     }
 
-    static void AddSchemas(CLI::App* command, std::vector<std::string>& schemas)
+    static CLI::Option* AddSchemas(CLI::App* command, std::vector<std::string>& schemas)
     {
-        AddText(command, "--schema", schemas,
-                "an inventory that the rules are for; repeat the option for several, the reference first")
-            ->required()
+        return AddText(command, "--schema", schemas,
+                       "an inventory that the rules are for; repeat the option for several, the reference first")
             // Otherwise the option would also take the arguments behind its value.
             ->allow_extra_args(false)
             ->option_text("INVENTORY");
+    }
+
+    static void AddStrictSchema(CLI::App* command, bool& strictSchema)
+    {
+        command->add_flag("--strict-schema", strictSchema,
+                          "take each inventory as it is: do not add declarations that only others have");
     }
 
     void AddCompare()
@@ -156,8 +161,7 @@ class TCommandLine {
             ->option_text("RULES");
         AddFormat(command, fCompare.format);
         AddOutput(command, fCompare.output);
-        command->add_flag("--strict-schema", fCompare.strictSchema,
-                          "take each inventory as it is: do not add declarations that only others have");
+        AddStrictSchema(command, fCompare.strictSchema);
     }
 
     void AddCheck()
@@ -166,6 +170,7 @@ class TCommandLine {
                                        [this](IConsole& console) { return RunCheck(fCheck, console); });
         AddText(command, "RULES", fCheck.rules, "the rules file, or - for standard input")->required()->option_text(" ");
         AddSchemas(command, fCheck.schemas);
+        AddStrictSchema(command, fCheck.strictSchema);
         AddOutput(command, fCheck.output);
     }
 
@@ -174,8 +179,10 @@ class TCommandLine {
         CLI::App* command = AddCommand("explain", "show which rule decides how a class or a property is compared",
                                        [this](IConsole& console) { return RunExplain(fExplain, console); });
         AddText(command, "ELEMENT", fExplain.element, "CLASS or CLASS.PROPERTY")->required()->option_text(" ");
-        AddText(command, "--spec", fExplain.rules, "the rules file")->required()->option_text("RULES");
-        AddSchemas(command, fExplain.schemas);
+        AddText(command, "--spec", fExplain.rules, "a rules file, or - for standard input (default: everything is compared)")
+            ->option_text("RULES");
+        AddSchemas(command, fExplain.schemas)->required();
+        AddStrictSchema(command, fExplain.strictSchema);
         AddOutput(command, fExplain.output);
     }
 

@@ -13,8 +13,11 @@ int RunCheck(const TCheckOptions& options, IConsole& console)
 {
     const std::optional<TRulesText> rules = ReadRulesFor(options.schemas, options.rules);
     std::vector<TInventory> inventories = TInventoryLoader(console).Load(options.schemas);
-    CompleteInventories(inventories, console);
-    DeliverResult(console, options.output, TRulesListing(*rules, inventories.front()).WriteCheck());
+    std::vector<TSchemaNote> notes;
+    if (!options.strictSchema && !inventories.empty()) {
+        notes = CompleteInventories(inventories, console);
+    }
+    DeliverResult(console, options.output, TRulesListing(*rules, inventories, notes).WriteCheck());
     return kExitSuccess;
 }
 

@@ -10,8 +10,9 @@ namespace NORVZEL20 {
 /// The arguments of `cimdelta check`.
 struct TCheckOptions {
     std::string rules;
-    std::vector<std::string> schemas;  ///< inventories, the reference first; at least one
+    std::vector<std::string> schemas;  ///< inventories, the reference first; none: only what needs no inventory is checked
     std::string output;                ///< empty: standard output
+    bool strictSchema = false;         ///< whether the inventories are left as they are
 };
 
 /// Writes what a rules file says and what follows from it. Returns kExitSuccess (0). Errors: TClientError, also for rules that a

@@ -5,6 +5,7 @@
 #include "client/process/ExitStatus.h"
 #include "client/report/ResultOutput.h"
 #include "client/report/TRulesListing.h"
+#include "client/rules/MadeRules.h"
 #include "client/rules/ReadRules.h"
 
 namespace NORVZEL20 {
@@ -13,8 +14,12 @@ int RunExplain(const TExplainOptions& options, IConsole& console)
 {
     const std::optional<TRulesText> rules = ReadRulesFor(options.schemas, options.rules);
     std::vector<TInventory> inventories = TInventoryLoader(console).Load(options.schemas);
-    CompleteInventories(inventories, console);
-    TRulesListing listing(*rules, inventories.front());
+    std::vector<TSchemaNote> notes;
+    if (!options.strictSchema) {
+        notes = CompleteInventories(inventories, console);
+    }
+    TRulesListing listing(rules ? *rules : TRulesText{"", MakeRulesForEverything(inventories.front(), notes), true}, inventories,
+                          notes);
     const std::size_t dot = options.element.find('.');
     DeliverResult(console, options.output,
                   dot == std::string::npos

@@ -9,10 +9,11 @@ namespace NORVZEL20 {
 
 /// The arguments of `cimdelta explain`.
 struct TExplainOptions {
-    std::string element;  ///< a class, or a class and a property with a dot between them
-    std::string rules;
+    std::string element;               ///< a class, or a class and a property with a dot between them
+    std::string rules;                 ///< empty: everything is compared
     std::vector<std::string> schemas;  ///< inventories, the reference first; at least one
     std::string output;                ///< empty: standard output
+    bool strictSchema = false;         ///< whether the inventories are left as they are
 };
 
 /// Writes which rule decides how a class or a property is treated. Returns kExitSuccess (0). Errors: TClientError.

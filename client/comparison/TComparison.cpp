@@ -70,7 +70,8 @@ TComparisonReport TComparison::Run(const std::optional<TRulesText>& rules, bool 
         fNotes = CompleteInventories(fInventories, fConsole);
     }
     const TRulesText text =
-        rules ? *rules : TRulesText{"the rules made for " + fInventories[0].path, MakeRulesForEverything(fInventories[0], fNotes)};
+        rules ? *rules
+              : TRulesText{"the rules made for " + fInventories[0].path, MakeRulesForEverything(fInventories[0], fNotes), true};
     TRules meaning(fInventories[0].ns, text);
     return RunWith(meaning, text);
 }

@@ -13,11 +13,14 @@
 #include <algorithm>
 #include <boost/algorithm/string/join.hpp>
 
+#include "client/inventory/CollectObjects.h"
 #include "client/inventory/RequireClass.h"
 #include "client/process/TClientError.h"
 #include "client/rules/DescribeReducedReferences.h"
+#include "client/rules/TSyntaxParser.h"
 #include "client/text/Counted.h"
 #include "client/text/DisplayText.h"
+#include "client/text/SomeOf.h"
 #include "embedded/value/TNameText.h"
 #include "provider/DeltaNames.h"
 
@@ -45,28 +48,36 @@ std::vector<std::string> PropertyNames(const TInMemClass& cls)
     return names;
 }
 
-std::size_t CountWithSubclasses(TInMemNamespace& ns, const std::string& className)
+// The schema to read the rules with.
+boost::shared_ptr<TInMemNamespace> FindSchema(const TRulesText& rules, const std::vector<TInventory>& inventories)
 {
-    // FindClass does not find the root class, which rules may name.
-    const auto cls = boost::dynamic_pointer_cast<TInMemClass>(ns.GetClass(className, TCallContext()));
-    std::size_t count = cls->GetInstanceCount();
-    for (const boost::shared_ptr<TInMemClass>& below : cls->GetClassesBelow()) {
-        count += below->GetInstanceCount();
+    if (!inventories.empty()) {
+        return inventories.front().ns;
     }
-    return count;
+    TSyntaxParser parser;
+    parser.Read(rules);
+    return parser.GetNamedClasses();
 }
 
 }  // namespace
 
-TRulesListing::TRulesListing(const TRulesText& rules, const TInventory& schema)
-    : fFile(rules.name), fSchema(schema), fRules(schema.ns, rules), fDocument(fRules.GetDocument()), fTrace(fDocument, schema.ns)
+TRulesListing::TRulesListing(const TRulesText& rules, const std::vector<TInventory>& inventories,
+                             const std::vector<TSchemaNote>& notes)
+    : fText(rules), fInventories(inventories), fNotes(notes), fSchema(FindSchema(rules, inventories)), fRules(fSchema, rules),
+      fDocument(fRules.GetDocument()), fTrace(fDocument, fSchema), fWarnings(fDocument, fTrace, fSchema, !inventories.empty())
 {}
 
 std::string TRulesListing::WriteCheck()
 {
     fOut.clear();
-    AddLine(fFile + ": " + Counted(fDocument.elements.size(), "element") + ", " + Counted(fTrace.GetWarnings().size(), "warning"));
+    AddLine(fText.name + ": " + Counted(fDocument.elements.size(), "element") + ", " + Counted(fWarnings.Get().size(), "warning"));
     WriteElements();
+    if (fInventories.empty()) {
+        WriteWarnings();
+        AddLine("");
+        AddLine("Whether the classes and properties are declared was not checked, because there is no --schema.");
+        return fOut;
+    }
     WriteEffective();
     WriteUnmatched();
     WriteWarnings();
@@ -90,9 +101,9 @@ void TRulesListing::WriteElements()
 void TRulesListing::WriteEffective()
 {
     AddLine("");
-    AddLine("Effective rules (classes with instances in " + fSchema.path + ", or with an element):");
-    for (const boost::shared_ptr<TInMemClass>& cls : fSchema.ns->GetClasses()) {
-        if (cls->GetInstanceCount() > 0 || HasElement(cls->GetName())) {
+    AddLine("Effective rules (classes with instances in " + PathsOfInventories() + ", or with an element):");
+    for (const boost::shared_ptr<TInMemClass>& cls : fSchema->GetClasses()) {
+        if (CountInstances(cls->GetName()) > 0 || HasElement(cls->GetName())) {
             WriteEffective(cls);
         }
     }
@@ -109,22 +120,25 @@ void TRulesListing::WriteEffective(const boost::shared_ptr<TInMemClass>& cls)
     const std::vector<std::string> all = PropertyNames(*cls);
     std::copy_if(all.begin(), all.end(), std::back_inserter(leftOut),
                  [&compared](const std::string& name) { return !Contains(compared, name); });
-    const std::vector<std::string>& keys = fRules.ExcludedKeysOf(cls->GetName());
+    const std::vector<std::string> keys = KeysLeftOut(*cls);
     AddLine("  " + cls->GetName() + ": " + std::to_string(all.size() - leftOut.size()) + " of " +
             Counted(all.size(), "property", "properties") + " compared" +
             (leftOut.empty() ? "" : ", all but " + boost::algorithm::join(leftOut, ", ")) +
             (keys.empty() ? "" : "; matched without " + boost::algorithm::join(keys, ", ")) +
-            (fTrace.FindReducedReferences(*cls).empty() ? "" : "; references compared " + DescribeReducedReferences(keys)));
+            (fTrace.FindReducedReferences(*cls).empty()
+                 ? ""
+                 : "; references compared " + DescribeReducedReferences(fRules.ExcludedKeysOf(cls->GetName()))));
 }
 
 void TRulesListing::WriteUnmatched()
 {
     std::string unmatched;
-    for (const TRulesDocument::TElement& element : fDocument.elements) {
-        // The rules of an element also reach the classes below its class.
-        if (CountWithSubclasses(*fSchema.ns, element.className) == 0) {
+    for (std::size_t index = 0; index < fDocument.elements.size(); ++index) {
+        const TRulesDocument::TElement& element = fDocument.elements[index];
+        // The rules of an element also reach the classes below its class. One without effect gets a warning instead.
+        if (!fTrace.GetArrival(index).complete && CountWithSubclasses(element.className) == 0) {
             unmatched += "  " +
-                         EscapeForDisplay(fFile + ":" + std::to_string(element.line) + ": class " + element.className +
+                         EscapeForDisplay(fText.name + ":" + std::to_string(element.line) + ": class " + element.className +
                                           " has no instances, nor has any class below it") +
                          "\n";
         }
@@ -136,26 +150,26 @@ void TRulesListing::WriteUnmatched()
 
 void TRulesListing::WriteWarnings()
 {
-    if (fTrace.GetWarnings().empty()) {
+    if (fWarnings.Get().empty()) {
         return;
     }
     AddLine("");
     AddLine("Warnings:");
-    for (const TRuleTrace::TWarning& warning : fTrace.GetWarnings()) {
-        AddLine("  " + fFile + ":" + std::to_string(warning.line) + ": " + warning.text);
+    for (const TRuleWarnings::TWarning& warning : fWarnings.Get()) {
+        AddLine("  " + fText.name + ":" + std::to_string(warning.line) + ": " + warning.text);
     }
 }
 
 std::string TRulesListing::WriteExplanation(const std::string& className)
 {
     fOut.clear();
-    const boost::shared_ptr<TInMemClass> cls = RequireClass(fSchema, className);
+    const boost::shared_ptr<TInMemClass> cls = RequireClass(fInventories.front(), className);
     const std::vector<std::string> compared = fRules.PropertiesOf(cls);
-    const std::vector<std::string>& keys = fRules.ExcludedKeysOf(cls->GetName());
+    const std::vector<std::string> keys = KeysLeftOut(*cls);
     AddLine(cls->GetName() + ": " + (compared.empty() ? "not compared" : "compared") + "; default " +
             Verb(fTrace.Find(cls->GetName()).byDefault.treatment) + ", " + Origin(fTrace.Find(cls->GetName()).byDefault));
     if (!keys.empty()) {
-        AddLine("  matched without " + boost::algorithm::join(keys, ", ") + " (excludekeys, " + fFile + ":" +
+        AddLine("  matched without " + boost::algorithm::join(keys, ", ") + " (excludekeys, " + fText.name + ":" +
                 std::to_string(fTrace.Find(cls->GetName()).excludedKeysLine) + ")");
     }
     for (const std::string& property : PropertyNames(*cls)) {
@@ -167,11 +181,11 @@ std::string TRulesListing::WriteExplanation(const std::string& className)
 std::string TRulesListing::WriteExplanation(const std::string& className, const std::string& property)
 {
     fOut.clear();
-    const boost::shared_ptr<TInMemClass> cls = RequireClass(fSchema, className);
+    const boost::shared_ptr<TInMemClass> cls = RequireClass(fInventories.front(), className);
     const boost::shared_ptr<TInMemPropertyDecl> decl = cls->FindPropertyDecl(property);
     if (!decl) {
-        throw TClientError(fSchema.path + ": class " + cls->GetName() + " has no property " + EscapeForDisplay(property) +
-                           "; cimdelta explain " + cls->GetName() + " lists those it has");
+        throw TClientError(fInventories.front().path + ": class " + cls->GetName() + " has no property " +
+                           EscapeForDisplay(property) + "; cimdelta explain " + cls->GetName() + " lists those it has");
     }
     AddLine(cls->GetName() + "." + Verdict(*cls, decl->GetName(), fRules.PropertiesOf(cls)));
     return fOut;
@@ -184,6 +198,54 @@ bool TRulesListing::HasElement(const std::string& className) const
     });
 }
 
+// The excluded keys that are keys of the class. Rules may also name others, which changes nothing.
+std::vector<std::string> TRulesListing::KeysLeftOut(const TInMemClass& cls)
+{
+    const std::vector<std::string> keys = KeyNamesOf(cls);
+    std::vector<std::string> leftOut;
+    for (const std::string& name : fRules.ExcludedKeysOf(cls.GetName())) {
+        if (std::find(keys.begin(), keys.end(), name) != keys.end()) {
+            leftOut.push_back(name);
+        }
+    }
+    return leftOut;
+}
+
+// In all inventories. An instance that cimdelta made is none.
+std::size_t TRulesListing::CountInstances(const std::string& className) const
+{
+    std::size_t count = 0;
+    for (const TInventory& inventory : fInventories) {
+        const boost::shared_ptr<TInMemClass> cls = inventory.ns->FindClass(className);
+        count += cls ? cls->GetInstanceCount() : 0;
+    }
+    if (TNameText::Equal(className, kOperatingSystemClass)) {
+        count -= static_cast<std::size_t>(std::count_if(
+            fNotes.begin(), fNotes.end(), [](const TSchemaNote& note) { return note.kind == TSchemaNote::kOperatingSystemMade; }));
+    }
+    return count;
+}
+
+std::size_t TRulesListing::CountWithSubclasses(const std::string& className) const
+{
+    // FindClass does not find the root class, which rules may name.
+    const auto cls = boost::dynamic_pointer_cast<TInMemClass>(fSchema->GetClass(className, TCallContext()));
+    std::size_t count = CountInstances(className);
+    for (const boost::shared_ptr<TInMemClass>& below : cls->GetClassesBelow()) {
+        count += CountInstances(below->GetName());
+    }
+    return count;
+}
+
+std::string TRulesListing::PathsOfInventories() const
+{
+    std::vector<std::string> paths;
+    for (const TInventory& inventory : fInventories) {
+        paths.push_back(inventory.path);
+    }
+    return SomeOf(paths);
+}
+
 std::string TRulesListing::Verdict(const TInMemClass& cls, const std::string& property, const std::vector<std::string>& compared)
 {
     const bool isCompared = Contains(compared, property);
@@ -191,7 +253,7 @@ std::string TRulesListing::Verdict(const TInMemClass& cls, const std::string& pr
     const bool isReduced = isCompared && std::find(reduced.begin(), reduced.end(), property) != reduced.end();
     return property + ": " + (isCompared ? "compared" : "not compared") + ", " + Reason(cls, property, isCompared) +
            (isReduced ? "; references " + DescribeReducedReferences(fRules.ExcludedKeysOf(cls.GetName())) + " (excludekeys, " +
-                            fFile + ":" + std::to_string(fTrace.Find(cls.GetName()).excludedKeysLine) + ")"
+                            fText.name + ":" + std::to_string(fTrace.Find(cls.GetName()).excludedKeysLine) + ")"
                       : "");
 }
 
@@ -208,9 +270,13 @@ std::string TRulesListing::Reason(const TInMemClass& cls, const std::string& pro
 
 std::string TRulesListing::Origin(const TRuleTrace::TDecision& decision) const
 {
+    if (fText.isMade) {
+        return decision.treatment == TCIMDiffEngine::INCLUDE ? "since everything is compared without --spec"
+                                                             : "since cimdelta made its instance";
+    }
     return decision.fromClass.empty()
                ? "since no element is for this class or one above it"
-               : fFile + ":" + std::to_string(decision.line) + " (element for class " + decision.fromClass + ")";
+               : fText.name + ":" + std::to_string(decision.line) + " (element for class " + decision.fromClass + ")";
 }
 
 void TRulesListing::AddLine(const std::string& text)

@@ -4,27 +4,34 @@
 #include <vector>
 
 #include "client/inventory/TInventory.h"
+#include "client/inventory/TSchemaNote.h"
 #include "client/rules/TRuleTrace.h"
+#include "client/rules/TRuleWarnings.h"
 #include "client/rules/TRules.h"
 #include "client/rules/TRulesDocument.h"
+#include "client/rules/TRulesText.h"
 
 namespace NORVZEL20 {
 
-/// What `check` and `explain` report about a rules file.
+/// What `check` and `explain` report about rules.
 class TRulesListing {
   public:
-    /// Reads the rules; `schema` must outlive this. Errors: TClientError for a file that the plug-in does not accept.
-    TRulesListing(const TRulesText& rules, const TInventory& schema);
+    /// `inventories` are those that the rules are for, the reference first, and `notes` what was done to complete them; both must
+    /// outlive this. Without inventories every class and property that the rules name counts as declared.
+    /// Errors: TClientError for rules that the plug-in does not accept.
+    TRulesListing(const TRulesText& rules, const std::vector<TInventory>& inventories, const std::vector<TSchemaNote>& notes);
     TRulesListing(const TRulesListing&) = delete;
     TRulesListing& operator=(const TRulesListing&) = delete;
 
     /// The elements with their lines, what follows from them for each class that has instances or an element, the elements whose
-    /// classes have no instances, and warnings.
+    /// classes have no instances, and warnings. Without inventories, the elements and those warnings that need none.
     std::string WriteCheck();
 
-    /// How a class is treated, property by property. Errors: TClientError if it is not declared.
+    /// How a class is treated, property by property. There must be an inventory.
+    /// Errors: TClientError if the reference does not declare the class.
     std::string WriteExplanation(const std::string& className);
-    /// How one property is treated. Errors: TClientError if the class or the property is not declared.
+    /// How one property is treated. There must be an inventory.
+    /// Errors: TClientError if the reference does not declare the class or the property.
     std::string WriteExplanation(const std::string& className, const std::string& property);
 
   private:
@@ -34,16 +41,23 @@ class TRulesListing {
     void WriteUnmatched();
     void WriteWarnings();
     bool HasElement(const std::string& className) const;
+    std::vector<std::string> KeysLeftOut(const TInMemClass& cls);
+    std::size_t CountInstances(const std::string& className) const;
+    std::size_t CountWithSubclasses(const std::string& className) const;
+    std::string PathsOfInventories() const;
     std::string Verdict(const TInMemClass& cls, const std::string& property, const std::vector<std::string>& compared);
     std::string Reason(const TInMemClass& cls, const std::string& property, bool isCompared) const;
     std::string Origin(const TRuleTrace::TDecision& decision) const;
     void AddLine(const std::string& text);
 
-    const std::string fFile;
-    const TInventory& fSchema;
+    const TRulesText fText;
+    const std::vector<TInventory>& fInventories;
+    const std::vector<TSchemaNote>& fNotes;
+    const boost::shared_ptr<TInMemNamespace> fSchema;
     TRules fRules;
     const TRulesDocument& fDocument;
     const TRuleTrace fTrace;
+    const TRuleWarnings fWarnings;
     std::string fOut;
 };
 

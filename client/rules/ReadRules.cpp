@@ -65,7 +65,7 @@ TRulesText ReadRules(const std::string& path)
 {
     CheckPath(path);
     TInputFile file(path);
-    const TRulesText rules{file.GetName(), ReadWhole(file)};
+    const TRulesText rules{file.GetName(), ReadWhole(file), false};
     CheckContent(rules);
     TSyntaxParser().Read(rules);
     return rules;

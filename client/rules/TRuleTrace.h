@@ -2,6 +2,7 @@
 
 #include <boost/smart_ptr/shared_ptr.hpp>
 #include <map>
+#include <optional>
 #include <string>
 #include <vector>
 
@@ -12,7 +13,7 @@
 
 namespace NORVZEL20 {
 
-/// Which element of a rules file decides what, class by class, and what in the file is probably a mistake.
+/// Which element of a rules file decides what, class by class.
 class TRuleTrace {
   public:
     /// A treatment and the element that gave it.
@@ -31,11 +32,10 @@ class TRuleTrace {
         unsigned int excludedKeysLine = 0;
     };
 
-    /// Something that is allowed but probably a mistake.
-    struct TWarning {
-        std::size_t element;  ///< the position of the element that it is about
-        unsigned int line;
-        std::string text;
+    /// What an element found when it was merged.
+    struct TArrival {
+        std::optional<std::size_t> keys;      ///< the element that had already given the class its excluded keys
+        std::optional<std::size_t> complete;  ///< the element that had already completed the class's rules
     };
 
     /// `document` is what the plug-in accepted for `schema`; it must outlive this. Errors: those of the schema.
@@ -51,27 +51,22 @@ class TRuleTrace {
     /// a class out of all references that its instances hold, whatever class they refer to, and the namespace too.
     std::vector<std::string> FindReducedReferences(const ICIMClass& cls) const;
 
-    /// In the order of the elements that they are about, then of their lines.
-    const std::vector<TWarning>& GetWarnings() const { return fWarnings; }
+    /// How the element at that position found its class.
+    const TArrival& GetArrival(std::size_t index) const { return fArrivals[index]; }
+
+    /// Which elements decide what in the end.
+    const TRuleMarks& GetMarks() const { return fMarks; }
 
   private:
-    void Apply(std::size_t index);
-    void WarnOfLateness(std::size_t index);
-    void WarnOfOverruled(std::size_t index);
-    void CheckNames(std::size_t index);
-    void CheckKeys(std::size_t index, const boost::shared_ptr<ICIMClass>& cls);
-    void WarnOfReducedReferences();
-    void Warn(std::size_t index, unsigned int line, const std::string& text);
+    void Merge(std::size_t index);
 
     TDecision MakeDefault(std::size_t index) const;
     TDecision MakeListed(std::size_t index, const std::string& property) const;
-    std::string LineOf(std::size_t index) const;
 
     const std::vector<TRulesDocument::TElement>& fElements;
-    boost::shared_ptr<ICIMNamespace> fSchema;
     TRuleMarks fMarks;
-    std::map<std::string, std::size_t> fFirst;  // the first element for each class, of those applied
-    std::vector<TWarning> fWarnings;
+    std::vector<TArrival> fArrivals;                 // one for each element
+    std::map<std::string, std::size_t> fCompleting;  // the element that completed the rules of each class
 };
 
 }  // namespace NORVZEL20

@@ -33,32 +33,19 @@ TEST_F(RulesCommandsTest, CheckWarnsOfWhatAnAuthorHardlyMeans)
     EXPECT_EQ(
         "Warnings:\n"
         "  odd-rules.xml:3: the element for class INV_Service is read before that of its ancestor INV_Element (line 4), whose "
-        "default and lists "
-        "replace its own; put the ancestor first\n"
+        "default and lists replace its own; put it after that one\n"
         "  odd-rules.xml:9: class inv_disk is declared as INV_Disk; letter case counts in rules, so this element does not apply "
         "to that class\n"
-        "  odd-rules.xml:10: excluded key Bootid is not a key of class INV_Disk\n"
+        "  odd-rules.xml:10: excluded key Bootid of class INV_Disk is declared as BootId; letter case counts in rules, so it still "
+        "counts as a key\n"
         "  odd-rules.xml:13: property size of class INV_Package is declared as Size; letter case counts in rules\n"
         "  odd-rules.xml:17: property Version of class INV_Package is already listed in this element; the first listing counts\n"
-        "  odd-rules.xml:20: excludekeys of class INV_Package has no effect: the class already has an element at line 11; name the "
-        "keys there\n"
-        "  odd-rules.xml:21: this element for class INV_Package has no effect: the class's rules were complete before it (its "
-        "first element is at "
-        "line 11); put everything into one element\n",
+        "  odd-rules.xml:20: excludekeys of class INV_Package has no effect: the class has the keys of its first element, at line "
+        "11; name them there\n"
+        "  odd-rules.xml:21: this element for class INV_Package has no effect: the element at line 20 completed the rules of the "
+        "class; put what is meant into that one\n",
         listing.substr(listing.find("Warnings:")));
     EXPECT_EQ(0, fStatus);
-}
-
-TEST_F(RulesCommandsTest, CheckShowsExcludedKeysThatComeTooLate)
-{
-    const std::string rules = Scratch("late", "<DifftoolSpec>\n<class name='INV_Element' default='include'/>\n"
-                                              "<class name='INV_Service' default='include' excludekeys='Id'/>\n</DifftoolSpec>");
-    const std::string listing = Shorten(Result({"check", rules, "--schema", "web01.xml"}), rules, "R");
-    EXPECT_EQ("Warnings:\n"
-              "  R:3: excludekeys of class INV_Service has no effect: the class already has the rules of its ancestor INV_Element "
-              "(line 2); put this element "
-              "before that one\n",
-              listing.substr(listing.find("Warnings:")));
 }
 
 TEST_F(RulesCommandsTest, CheckShowsRulesThatMatchedNothing)
@@ -119,7 +106,8 @@ TEST_F(RulesCommandsTest, ExplainFollowsAnIncludedNameInAnotherLetterCase)
                         "</class></DifftoolSpec>");
     EXPECT_EQ("INV_Package.Version: compared, included by the list at R:3 (element for class INV_Package)\n",
               Shorten(Result({"explain", "INV_Package.Version", "--spec", rules, "--schema", "web01.xml"}), rules, "R"));
-    EXPECT_NE(std::string::npos, Result({"compare", "--spec", rules, "web01.xml", "web02.xml"}).find("    version: 5.1 -> 5.2\n"));
+    Run({"compare", "--spec", rules, "web01.xml", "web02.xml"});
+    EXPECT_NE(std::string::npos, fOut.find("    version: 5.1 -> 5.2\n")) << fOut;
 }
 
 TEST_F(RulesCommandsTest, ExplainKnowsWhatIsNeverCompared)
@@ -171,23 +159,7 @@ TEST_F(RulesCommandsTest, OrderCountsWithinALineToo)
     EXPECT_EQ(
         "Warnings:\n"
         "  R:1: the element for class INV_Service is read before that of its ancestor INV_Element (line 1), whose default and "
-        "lists replace its own; put the ancestor first\n",
-        listing.substr(std::min(listing.size(), listing.find("Warnings:"))));
-}
-
-TEST_F(RulesCommandsTest, AnElementWithoutEffectOverrulesNothing)
-{
-    const std::string rules = Scratch("third", "<DifftoolSpec>\n<class name='INV_Service'/>\n<class name='INV_Element'/>\n"
-                                               "<class name='INV_Element'/>\n<class name='INV_Element'/>\n</DifftoolSpec>");
-    const std::string listing = Shorten(Result({"check", rules, "--schema", "web01.xml"}), rules, "R");
-    EXPECT_EQ(
-        "Warnings:\n"
-        "  R:2: the element for class INV_Service is read before that of its ancestor INV_Element (line 3), whose default and "
-        "lists replace its own; put the ancestor first\n"
-        "  R:2: the element for class INV_Service is read before that of its ancestor INV_Element (line 4), whose default and "
-        "lists replace its own; put the ancestor first\n"
-        "  R:5: this element for class INV_Element has no effect: the class's rules were complete before it (its first element "
-        "is at line 3); put everything into one element\n",
+        "lists replace its own; put it after that one\n",
         listing.substr(std::min(listing.size(), listing.find("Warnings:"))));
 }
 
@@ -201,10 +173,10 @@ TEST_F(RulesCommandsTest, TheRootClassStandsForAllClasses)
               "  line 1: class <root>, default include, excludekeys BootId\n"
               "\n"
               "Effective rules (classes with instances in web01.xml, or with an element):\n"
-              "  KALMO_OperatingSystem: 2 of 3 properties compared, all but DateTimeOfCollection; matched without BootId\n"
-              "  INV_Package: 5 of 5 properties compared; matched without BootId\n"
+              "  KALMO_OperatingSystem: 2 of 3 properties compared, all but DateTimeOfCollection\n"
+              "  INV_Package: 5 of 5 properties compared\n"
               "  INV_Disk: 4 of 4 properties compared; matched without BootId\n"
-              "  INV_Service: 3 of 3 properties compared; matched without BootId\n",
+              "  INV_Service: 3 of 3 properties compared\n",
               Shorten(Result({"check", rules, "--schema", "web01.xml"}), rules, "R"));
     EXPECT_EQ("INV_Disk.Model: compared, by default, R:1 (element for class <root>)\n",
               Shorten(Result({"explain", "INV_Disk.Model", "--spec", rules, "--schema", "web01.xml"}), rules, "R"));
@@ -213,10 +185,109 @@ TEST_F(RulesCommandsTest, TheRootClassStandsForAllClasses)
 TEST_F(RulesCommandsTest, AnExcludedKeyThatNoClassBelowHasGetsAWarning)
 {
     const std::string rules =
-        Scratch("below", "<DifftoolSpec><class name='&lt;root&gt;' excludekeys='BootId Bootid'/></DifftoolSpec>");
+        Scratch("below", "<DifftoolSpec><class name='&lt;root&gt;' default='include' excludekeys='BootId Nix'/></DifftoolSpec>");
     const std::string listing = Shorten(Result({"check", rules, "--schema", "web01.xml"}), rules, "R");
-    EXPECT_EQ("Warnings:\n  R:1: excluded key Bootid is not a key of class <root>\n",
+    EXPECT_EQ("Warnings:\n  R:1: excluded key Nix is not a key of class <root>\n",
               listing.substr(std::min(listing.size(), listing.find("Warnings:"))));
+}
+
+TEST_F(RulesCommandsTest, WithoutASchemaCheckReadsTheRulesAlone)
+{
+    const std::string rules = Scratch("alone", "<DifftoolSpec>\n<class name='Nix' default='include' excludekeys='Id'>\n"
+                                               "<excludelist><value>Size</value></excludelist></class>\n</DifftoolSpec>");
+    EXPECT_EQ("R: 1 element, 0 warnings\n"
+              "\n"
+              "Elements:\n"
+              "  line 2: class Nix, default include, excludekeys Id\n"
+              "    line 3: exclude Size\n"
+              "\n"
+              "Whether the classes and properties are declared was not checked, because there is no --schema.\n",
+              Shorten(Result({"check", rules}), rules, "R"));
+    EXPECT_EQ(0, fStatus);
+    const std::string wrong = Scratch("wrong", "<DifftoolSpec><class name='Nix' default='includes'/></DifftoolSpec>");
+    EXPECT_EQ("cimdelta: R:1: default \"includes\" is neither \"include\" nor \"exclude\"; letter case counts\n",
+              Shorten(Complaint({"check", wrong}), wrong, "R"));
+}
+
+TEST_F(RulesCommandsTest, WithoutRulesExplainShowsThatEverythingIsCompared)
+{
+    EXPECT_EQ("INV_Package.Version: compared, by default, since everything is compared without --spec\n",
+              Result({"explain", "INV_Package.Version", "--schema", "web01.xml"}));
+    EXPECT_EQ("KALMO_OperatingSystem: compared; default include, since everything is compared without --spec\n"
+              "  Name: compared, by default, since everything is compared without --spec\n"
+              "  OSType: compared, by default, since everything is compared without --spec\n"
+              "  DateTimeOfCollection: not compared, because the time of collection is never compared if the default is include\n",
+              Result({"explain", "KALMO_OperatingSystem", "--schema", "web01.xml"}));
+}
+
+TEST_F(RulesCommandsTest, AStrictSchemaIsThatOfTheReferenceAlone)
+{
+    const std::string rules = Scratch("extra", "<DifftoolSpec><class name='INV_Extra' default='include'/></DifftoolSpec>");
+    const std::vector<std::string> schemas{"--schema", "web01.xml", "--schema", "other-schema.xml"};
+    for (std::vector<std::string> command : {std::vector<std::string>{"check", rules}, {"explain", "INV_Extra", "--spec", rules}}) {
+        command.insert(command.end(), schemas.begin(), schemas.end());
+        Run(command);
+        EXPECT_EQ(0, fStatus) << fErr;
+        command.push_back("--strict-schema");
+        EXPECT_EQ("cimdelta: R:1: class INV_Extra is not declared in the reference; correct the name or remove the element\n",
+                  Shorten(Complaint(command), rules, "R"));
+    }
+}
+
+TEST_F(RulesCommandsTest, InstancesOfEveryInventoryCount)
+{
+    const std::string rules = Scratch("any", "<DifftoolSpec><class name='INV_Package' default='include'/></DifftoolSpec>");
+    const std::string listing =
+        Shorten(Result({"check", rules, "--schema", "empty-classes.xml", "--schema", "web01.xml"}), rules, "R");
+    EXPECT_EQ(std::string::npos, listing.find("Rules that matched nothing")) << listing;
+    EXPECT_NE(std::string::npos,
+              listing.find("\nEffective rules (classes with instances in empty-classes.xml, web01.xml, or with an "
+                           "element):\n"))
+        << listing;
+    EXPECT_NE(std::string::npos, listing.find("\n  INV_Service: not compared\n")) << listing;
+}
+
+/// What cimdelta makes itself is nothing that rules were written for.
+TEST_F(RulesCommandsTest, AMadeOperatingSystemIsNoInstance)
+{
+    const std::string rules =
+        Scratch("made", "<DifftoolSpec><class name='KALMO_OperatingSystem' default='include'/></DifftoolSpec>");
+    Run({"check", rules, "--schema", "other-schema.xml"});
+    EXPECT_NE(std::string::npos, fOut.find(":1: class KALMO_OperatingSystem has no instances, nor has any class below it\n"))
+        << fOut;
+    Run({"check", rules, "--schema", "other-schema.xml", "--schema", "web01.xml"});
+    EXPECT_EQ(std::string::npos, fOut.find("has no instances")) << fOut;
+}
+
+TEST_F(RulesCommandsTest, TwoSpellingsInListsAreExplainedAsTheyAreCompared)
+{
+    const struct {
+        const char* byDefault;
+        const char* included;
+        const char* excluded;
+        const char* explanation;
+    } rows[] = {
+        {"exclude", "version", "Version",
+         "INV_Package.Version: compared, included by the list at R:2 (element for class INV_Package)\n"},
+        {"exclude", "Version", "version",
+         "INV_Package.Version: compared, included by the list at R:2 (element for class INV_Package)\n"},
+        {"include", "version", "Version",
+         "INV_Package.Version: not compared, excluded by the list at R:3 (element for class INV_Package)\n"},
+        {"include", "Version", "version",
+         "INV_Package.Version: compared, included by the list at R:2 (element for class INV_Package)\n"},
+    };
+    for (const auto& row : rows) {
+        const std::string rules =
+            Scratch("spellings", std::string("<DifftoolSpec><class name='INV_Package' default='") + row.byDefault +
+                                     "'>\n<includelist><value>" + row.included + "</value></includelist>\n<excludelist><value>" +
+                                     row.excluded + "</value></excludelist></class></DifftoolSpec>");
+        const std::string explanation =
+            Shorten(Result({"explain", "INV_Package.Version", "--spec", rules, "--schema", "web01.xml"}), rules, "R");
+        EXPECT_EQ(row.explanation, explanation);
+        Run({"compare", "--spec", rules, "web01.xml", "web02.xml"});
+        EXPECT_EQ(explanation.find("not compared") == std::string::npos, fOut.find("ersion: 5.1 -> 5.2") != std::string::npos)
+            << fOut;
+    }
 }
 
 TEST_F(RulesCommandsTest, WhatIsNotDeclaredCannotBeExplained)

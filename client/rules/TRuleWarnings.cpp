@@ -1,0 +1,218 @@
+// Each element is judged once, by what became of it when all were merged (TRuleTrace):
+//
+//     the class's rules were complete before it             it has no effect; nothing else is said about it
+//     the class had rules before it                         its excluded keys have no effect
+//     a class above decides the default in the end          the element came too early
+//     it decides the default, but names none                the class is left out, perhaps without intent
+//
+// What is odd in an element by itself (letter case, repeated names, keys that are none) needs only the schema.
+//
+// Excluded keys come from the first element that reaches a class, default and lists from the last. So a class below one that has
+// rules needs two elements for both: one with the keys before the ancestor's, one with the rest after it. The advice of the two
+// warnings about order leads there, whichever comes first.
+#include "client/rules/TRuleWarnings.h"
+
+#include <algorithm>
+#include <map>
+#include <set>
+#include <tuple>
+#include <utility>
+
+#include "client/inventory/CollectObjects.h"
+#include "client/rules/DescribeReducedReferences.h"
+#include "client/text/SomeOf.h"
+#include "embedded/value/TNameText.h"
+
+namespace NORVZEL20 {
+
+namespace {
+
+// The class and all classes below it.
+std::vector<boost::shared_ptr<ICIMClass>> TreeOf(const boost::shared_ptr<ICIMClass>& cls)
+{
+    std::vector<boost::shared_ptr<ICIMClass>> tree =
+        Collect<ICIMClass>([&cls](const auto& callback) { cls->EnumerateSubClasses(callback, true, TCallContext()); });
+    tree.push_back(cls);
+    return tree;
+}
+
+}  // namespace
+
+TRuleWarnings::TRuleWarnings(const TRulesDocument& document, const TRuleTrace& trace, boost::shared_ptr<ICIMNamespace> schema,
+                             bool isSchemaKnown)
+    : fElements(document.elements), fTrace(trace), fMarks(trace.GetMarks()), fSchema(std::move(schema)),
+      fIsSchemaKnown(isSchemaKnown)
+{
+    for (std::size_t index = 0; index < fElements.size(); ++index) {
+        Check(index);
+    }
+    if (fIsSchemaKnown) {
+        CheckReferences();
+    }
+    std::stable_sort(fWarnings.begin(), fWarnings.end(), [](const TWarning& a, const TWarning& b) {
+        return std::tie(a.element, a.line) < std::tie(b.element, b.line);
+    });
+}
+
+void TRuleWarnings::Check(std::size_t index)
+{
+    const TRulesDocument::TElement& element = fElements[index];
+    if (const std::optional<std::size_t> complete = fTrace.GetArrival(index).complete) {
+        Warn(index, element.line,
+             "this element for class " + element.className + " has no effect: the element at " + LineOf(*complete) +
+                 " completed the rules of the class; put what is meant into that one");
+        return;
+    }
+    CheckRepetition(index);
+    if (!element.excludedKeys.empty() && fTrace.GetArrival(index).keys) {
+        WarnOfLateKeys(index, *fTrace.GetArrival(index).keys);
+    }
+    if (fIsSchemaKnown) {
+        const boost::shared_ptr<ICIMClass> cls = fSchema->GetClass(element.className, TCallContext());
+        CheckNames(index, *cls);
+        CheckKeys(index, cls);
+        CheckOverruled(index);
+        CheckDefault(index);
+    }
+}
+
+void TRuleWarnings::CheckNames(std::size_t index, const ICIMClass& cls)
+{
+    const TRulesDocument::TElement& element = fElements[index];
+    const std::string& declared = cls.GetName(TCallContext());
+    if (declared != element.className) {
+        Warn(index, element.line,
+             "class " + element.className + " is declared as " + declared +
+                 "; letter case counts in rules, so this element does not apply to that class");
+    }
+    for (const TRulesDocument::TListed& listed : element.listed) {
+        const std::string& name = cls.GetPropertyDecl(listed.property, TCallContext())->GetName(TCallContext());
+        if (name != listed.property) {
+            Warn(index, listed.line,
+                 "property " + listed.property + " of class " + element.className + " is declared as " + name +
+                     "; letter case counts in rules");
+        }
+    }
+}
+
+void TRuleWarnings::CheckRepetition(std::size_t index)
+{
+    const TRulesDocument::TElement& element = fElements[index];
+    std::map<std::string, std::size_t> counts;
+    for (const TRulesDocument::TListed& listed : element.listed) {
+        if (++counts[listed.property] == 2) {
+            Warn(index, listed.line,
+                 "property " + listed.property + " of class " + element.className +
+                     " is already listed in this element; the first listing counts");
+        }
+    }
+}
+
+// The keys of an element take effect in its class and in those below that had no rules yet.
+void TRuleWarnings::CheckKeys(std::size_t index, const boost::shared_ptr<ICIMClass>& cls)
+{
+    const TRulesDocument::TElement& element = fElements[index];
+    if (element.excludedKeys.empty() || fTrace.GetArrival(index).keys) {
+        return;
+    }
+    std::set<std::string> keys;
+    for (const boost::shared_ptr<ICIMClass>& reached : TreeOf(cls)) {
+        if (fMarks.FindKeys(reached->GetName(TCallContext())) == index || reached == cls) {
+            const std::vector<std::string> names = KeyNamesOf(*reached);
+            keys.insert(names.begin(), names.end());
+        }
+    }
+    for (const std::string& key : element.excludedKeys) {
+        if (keys.count(key) != 0) {
+            continue;
+        }
+        const auto other =
+            std::find_if(keys.begin(), keys.end(), [&key](const std::string& name) { return TNameText::Equal(name, key); });
+        Warn(index, element.line,
+             other == keys.end() ? "excluded key " + key + " is not a key of class " + element.className
+                                 : "excluded key " + key + " of class " + element.className + " is declared as " + *other +
+                                       "; letter case counts in rules, so it still counts as a key");
+    }
+}
+
+void TRuleWarnings::WarnOfLateKeys(std::size_t index, std::size_t earlier)
+{
+    const TRulesDocument::TElement& element = fElements[index];
+    const TRulesDocument::TElement& first = fElements[earlier];
+    std::string reason;
+    if (first.className == element.className) {
+        reason = "the class has the keys of its first element, at " + LineOf(earlier) + "; name them there";
+    } else {
+        reason = "the class already has the rules of its ancestor " + first.className + " (" + LineOf(earlier) + "); put " +
+                 (element.hasDefault || !element.listed.empty()
+                      ? "an element for " + element.className +
+                            " with excludekeys alone before that one, and keep default and lists here"
+                      : std::string("this element before that one"));
+    }
+    Warn(index, element.line, "excludekeys of class " + element.className + " has no effect: " + reason);
+}
+
+void TRuleWarnings::CheckOverruled(std::size_t index)
+{
+    const TRulesDocument::TElement& element = fElements[index];
+    const std::size_t decider = *fMarks.FindDefault(element.className);
+    // Without default and lists the element is there for its keys, which nothing replaces.
+    if (decider <= index || fElements[decider].className == element.className || (!element.hasDefault && element.listed.empty())) {
+        return;
+    }
+    Warn(index, element.line,
+         "the element for class " + element.className + " is read before that of its ancestor " + fElements[decider].className +
+             " (" + LineOf(decider) + "), whose default and lists replace its own; " +
+             (element.excludedKeys.empty() ? "put it after that one"
+                                           : "keep excludekeys alone here, and put default and lists into a second element for " +
+                                                 element.className + " after that one"));
+}
+
+void TRuleWarnings::CheckDefault(std::size_t index)
+{
+    const TRulesDocument::TElement& element = fElements[index];
+    if (element.hasDefault || fMarks.FindDefault(element.className) != index) {
+        return;
+    }
+    for (const auto& [property, lister] : fMarks.FindListed(element.className)) {
+        const std::vector<TRulesDocument::TListed>& listed = fElements[lister].listed;
+        const auto first =
+            std::find_if(listed.begin(), listed.end(), [&name = property](const auto& entry) { return entry.property == name; });
+        if (first->treatment == TCIMDiffEngine::INCLUDE) {
+            return;
+        }
+    }
+    Warn(index, element.line,
+         "class " + element.className +
+             " is not compared: this element has no default, which means exclude, and no list includes a "
+             "property; write default=\"include\" or default=\"exclude\"");
+}
+
+// One warning for each element: its keys may reach many classes below its class.
+void TRuleWarnings::CheckReferences()
+{
+    std::map<std::size_t, std::vector<std::string>> references;
+    for (const boost::shared_ptr<ICIMClass>& cls : AllClassesOf(*fSchema)) {
+        const std::string& className = cls->GetName(TCallContext());
+        for (const std::string& property : fTrace.FindReducedReferences(*cls)) {
+            references[*fMarks.FindKeys(className)].push_back(className + "." + property);
+        }
+    }
+    for (const auto& [index, properties] : references) {
+        Warn(index, fElements[index].line,
+             "excludekeys also applies to references: those in " + SomeOf(properties) + " are compared " +
+                 DescribeReducedReferences(fElements[index].excludedKeys));
+    }
+}
+
+void TRuleWarnings::Warn(std::size_t index, unsigned int line, const std::string& text)
+{
+    fWarnings.push_back({index, line, text});
+}
+
+std::string TRuleWarnings::LineOf(std::size_t index) const
+{
+    return "line " + std::to_string(fElements[index].line);
+}
+
+}  // namespace NORVZEL20

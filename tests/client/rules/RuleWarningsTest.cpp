@@ -1,0 +1,185 @@
+// Warnings are about rules that the plug-in accepts, so documents are written as text and read as the client reads them.
+
+#include "client/rules/TRuleWarnings.h"
+
+#include <gtest/gtest.h>
+
+#include <algorithm>
+
+#include "client/rules/TRulesParser.h"
+#include "client/rules/TSyntaxParser.h"
+#include "embedded/store/TInMemNamespace.h"
+#include "tests/support/TNamespaceBuilder.h"
+
+namespace NORVZEL20 {
+namespace {
+
+/// A small tree: A (key K, p, q) above B (key L) and C, B above D; X stands alone.
+class RuleWarningsTest : public ::testing::Test {
+  protected:
+    RuleWarningsTest()
+    {
+        TNamespaceBuilder(fSchema)
+            .Class("A", "", {TNamespaceBuilder::Key("K"), TNamespaceBuilder::Property("p"), TNamespaceBuilder::Property("q")})
+            .Class("B", "A", {TNamespaceBuilder::Key("L")})
+            .Class("C", "A", {})
+            .Class("D", "B", {})
+            .Class("X", "", {TNamespaceBuilder::Key("Id")});
+    }
+
+    /// The warnings about a file with these elements, one on each line, from line 1.
+    std::string Warnings(const std::vector<std::string>& elements) const
+    {
+        TRulesParser parser(fSchema);
+        return WarningsOf(parser, elements, fSchema, true);
+    }
+
+    /// Those of a reader that has no schema.
+    static std::string WarningsWithoutSchema(const std::vector<std::string>& elements)
+    {
+        TSyntaxParser parser;
+        return WarningsOf(parser, elements, parser.GetNamedClasses(), false);
+    }
+
+    static std::string Text(const std::vector<std::string>& elements)
+    {
+        std::string text = "<DifftoolSpec>";
+        for (const std::string& element : elements) {
+            text += element + "\n";
+        }
+        return text + "</DifftoolSpec>";
+    }
+
+    boost::shared_ptr<TInMemNamespace> fSchema = TInMemNamespace::Create("root/cimv2");
+
+  private:
+    static std::string WarningsOf(TRulesParser& parser, const std::vector<std::string>& elements,
+                                  const boost::shared_ptr<TInMemNamespace>& schema, bool isSchemaKnown)
+    {
+        parser.Read({"R", Text(elements), false});
+        const TRuleTrace trace(parser.GetDocument(), schema);
+        const TRuleWarnings warnings(parser.GetDocument(), trace, schema, isSchemaKnown);
+        std::string text;
+        for (const TRuleWarnings::TWarning& warning : warnings.Get()) {
+            text += std::to_string(warning.line) + " " + warning.text + "\n";
+        }
+        return text;
+    }
+};
+
+const char kLateKeys[] =
+    "2 excludekeys of class B has no effect: the class already has the rules of its ancestor A (line 1); put an element for B with "
+    "excludekeys alone before that one, and keep default and lists here\n";
+const char kOverruled[] =
+    "1 the element for class B is read before that of its ancestor A (line 2), whose default and lists replace its own; keep "
+    "excludekeys alone here, and put default and lists into a second element for B after that one\n";
+
+TEST_F(RuleWarningsTest, OrdinaryRulesGetNone)
+{
+    const std::vector<std::string> rows[] = {
+        {},
+        {"<class name='A' default='include'/>", "<class name='B' default='exclude'/>", "<class name='D' default='include'/>"},
+        {"<class name='C' default='exclude'/>", "<class name='C' default='include'/>"},
+        {"<class name='A'><includelist><value>p</value></includelist></class>"},
+        {"<class name='&lt;root&gt;' default='include'/>"},
+        {"<class name='&lt;root&gt;' default='include' excludekeys='K L Id'/>"},
+        {"<class name='B' default='include' excludekeys='L K'/>"},
+        // A key of a class below.
+        {"<class name='A' default='include' excludekeys='L'/>"},
+        // Keys alone, before the ancestor that gives the default.
+        {"<class name='B' excludekeys='L'/>", "<class name='A' default='include'/>"},
+    };
+    for (const auto& row : rows) {
+        EXPECT_EQ("", Warnings(row)) << Text(row);
+        EXPECT_EQ("", WarningsWithoutSchema(row)) << Text(row);
+    }
+}
+
+/// Each advice is followed in turn; it ends where nothing is left to warn of, whichever of the two comes first.
+TEST_F(RuleWarningsTest, TheAdviceAboutOrderLeadsToRulesWithoutWarnings)
+{
+    const std::string ancestor = "<class name='A' default='include'/>";
+    const std::string whole =
+        "<class name='B' default='exclude' excludekeys='L'><includelist><value>p</value></includelist></class>";
+    EXPECT_EQ(kLateKeys, Warnings({ancestor, whole}));
+    EXPECT_EQ(kOverruled, Warnings({whole, ancestor}));
+    const std::string rest = "<class name='B' default='exclude'><includelist><value>p</value></includelist></class>";
+    EXPECT_EQ("", Warnings({"<class name='B' excludekeys='L'/>", ancestor, rest}));
+}
+
+TEST_F(RuleWarningsTest, EachIsGivenForItsCause)
+{
+    const struct {
+        std::vector<std::string> elements;
+        const char* warnings;
+    } rows[] = {
+        {{"<class name='A' default='include'/>", "<class name='B' excludekeys='L'/>"},
+         "2 excludekeys of class B has no effect: the class already has the rules of its ancestor A (line 1); put this element "
+         "before "
+         "that one\n"
+         "2 class B is not compared: this element has no default, which means exclude, and no list includes a property; write "
+         "default=\"include\" or default=\"exclude\"\n"},
+        {{"<class name='D' default='include'/>", "<class name='A' default='exclude'/>"},
+         "1 the element for class D is read before that of its ancestor A (line 2), whose default and lists replace its own; put "
+         "it "
+         "after that one\n"},
+        // Said once, of the element that decides in the end.
+        {{"<class name='D' default='include'/>", "<class name='B' default='exclude'/>", "<class name='A' default='exclude'/>",
+          "<class name='A' default='include'/>"},
+         "1 the element for class D is read before that of its ancestor A (line 4), whose default and lists replace its own; put "
+         "it "
+         "after that one\n"
+         "2 the element for class B is read before that of its ancestor A (line 4), whose default and lists replace its own; put "
+         "it "
+         "after that one\n"},
+        // The ancestor came later, but then the class again.
+        {{"<class name='D' default='include'/>", "<class name='A' default='exclude'/>", "<class name='D' default='include'/>"}, ""},
+        {{"<class name='C' default='include'/>", "<class name='C' default='include'/>", "<class name='C' default='include'/>"},
+         "3 this element for class C has no effect: the element at line 2 completed the rules of the class; put what is meant into "
+         "that one\n"},
+        {{"<class name='A' default='include'/>", "<class name='B' default='include'/>",
+          "<class name='B' excludekeys='nix'><includelist><value>p</value><value>p</value></includelist></class>"},
+         "3 this element for class B has no effect: the element at line 2 completed the rules of the class; put what is meant into "
+         "that one\n"},
+        {{"<class name='C' default='include'/>", "<class name='C' default='include' excludekeys='K'/>"},
+         "2 excludekeys of class C has no effect: the class has the keys of its first element, at line 1; name them there\n"},
+        {{"<class name='A' default='include' excludekeys='p'/>"}, "1 excluded key p is not a key of class A\n"},
+        {{"<class name='A' default='include' excludekeys='k'/>"},
+         "1 excluded key k of class A is declared as K; letter case counts in rules, so it still counts as a key\n"},
+        // Only B has the key, and B has its keys from line 1.
+        {{"<class name='B' excludekeys='K'/>", "<class name='A' default='include' excludekeys='L'/>"},
+         "2 excluded key L is not a key of class A\n"},
+        {{"<class name='a' default='include'/>"},
+         "1 class a is declared as A; letter case counts in rules, so this element does not apply to that class\n"},
+        {{"<class name='A' default='include'><excludelist><value>P</value><value>q</value><value>q</value><value>q</value>"
+          "</excludelist></class>"},
+         "1 property q of class A is already listed in this element; the first listing counts\n"
+         "1 property P of class A is declared as p; letter case counts in rules\n"},
+        {{"<class name='A'/>"},
+         "1 class A is not compared: this element has no default, which means exclude, and no list includes a property; write "
+         "default=\"include\" or default=\"exclude\"\n"},
+        {{"<class name='A'><excludelist><value>p</value></excludelist><includelist><value>p</value></includelist></class>"},
+         "1 property p of class A is already listed in this element; the first listing counts\n"
+         "1 class A is not compared: this element has no default, which means exclude, and no list includes a property; write "
+         "default=\"include\" or default=\"exclude\"\n"},
+    };
+    for (const auto& row : rows) {
+        EXPECT_EQ(row.warnings, Warnings(row.elements)) << Text(row.elements);
+    }
+}
+
+TEST_F(RuleWarningsTest, WithoutASchemaOnlyWhatHoldsForEverySchemaIsSaid)
+{
+    EXPECT_EQ("",
+              WarningsWithoutSchema({"<class name='B' default='include'/>", "<class name='A' default='exclude' excludekeys='nix'/>",
+                                     "<class name='a' excludekeys='K'/>", "<class name='N'/>"}));
+    EXPECT_EQ("1 property p of class N is already listed in this element; the first listing counts\n"
+              "2 excludekeys of class N has no effect: the class has the keys of its first element, at line 1; name them there\n"
+              "3 this element for class N has no effect: the element at line 2 completed the rules of the class; put what is meant "
+              "into that one\n",
+              WarningsWithoutSchema({"<class name='N'><includelist><value>p</value><value>p</value></includelist></class>",
+                                     "<class name='N' excludekeys='k'/>", "<class name='N'/>"}));
+}
+
+}  // namespace
+}  // namespace NORVZEL20
