@@ -21,6 +21,7 @@
 #include "client/process/TClientError.h"
 #include "client/process/TProgress.h"
 #include "client/rules/MadeRules.h"
+#include "client/rules/SayRuleWarnings.h"
 #include "client/rules/TLogCapture.h"
 #include "embedded/services/TAssertionFailure.h"
 #include "host/TNamespaceProviderManager.h"
@@ -73,6 +74,9 @@ TComparisonReport TComparison::Run(const std::optional<TRulesText>& rules, bool 
         rules ? *rules
               : TRulesText{"the rules made for " + fInventories[0].path, MakeRulesForEverything(fInventories[0], fNotes), true};
     TRules meaning(fInventories[0].ns, text);
+    if (!text.isMade) {
+        SayRuleWarnings(fConsole, text.name, meaning.GetDocument(), fInventories[0].ns);
+    }
     return RunWith(meaning, text);
 }
 

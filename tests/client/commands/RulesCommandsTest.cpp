@@ -290,6 +290,17 @@ TEST_F(RulesCommandsTest, TwoSpellingsInListsAreExplainedAsTheyAreCompared)
     }
 }
 
+TEST_F(RulesCommandsTest, CompareSaysTheWarningsOfCheck)
+{
+    Run({"compare", "--spec", "odd-rules.xml", "web01.xml", "web02.xml"});
+    EXPECT_EQ(7, std::count(fErr.begin(), fErr.end(), '\n')) << fErr;
+    EXPECT_EQ(0u, fErr.find("cimdelta: odd-rules.xml:3: warning: the element for class INV_Service is read before")) << fErr;
+    Run({"compare", "--spec", "rules.xml", "web01.xml", "web02.xml"});
+    EXPECT_EQ("", fErr);
+    Run({"compare", "web01.xml", "web02.xml"});
+    EXPECT_EQ("", fErr);
+}
+
 TEST_F(RulesCommandsTest, WhatIsNotDeclaredCannotBeExplained)
 {
     EXPECT_EQ("cimdelta: web01.xml: declares no class Nix; cimdelta show web01.xml lists those it declares\n",

@@ -6,9 +6,11 @@
 
 #include <algorithm>
 
+#include "client/rules/SayRuleWarnings.h"
 #include "client/rules/TRulesParser.h"
 #include "client/rules/TSyntaxParser.h"
 #include "embedded/store/TInMemNamespace.h"
+#include "tests/client/TFakeConsole.h"
 #include "tests/support/TNamespaceBuilder.h"
 
 namespace NORVZEL20 {
@@ -179,6 +181,27 @@ TEST_F(RuleWarningsTest, WithoutASchemaOnlyWhatHoldsForEverySchemaIsSaid)
               "into that one\n",
               WarningsWithoutSchema({"<class name='N'><includelist><value>p</value><value>p</value></includelist></class>",
                                      "<class name='N' excludekeys='k'/>", "<class name='N'/>"}));
+}
+
+TEST_F(RuleWarningsTest, OfVeryManyOnlyTheFirstAreSaid)
+{
+    const auto said = [this](std::size_t count) {
+        TRulesParser parser(fSchema);
+        parser.Read({"R", Text(std::vector<std::string>(count, "<class name='X' default='include'/>")), false});
+        TFakeConsole console;
+        SayRuleWarnings(console, "R", parser.GetDocument(), fSchema);
+        return console.fErr;
+    };
+    EXPECT_EQ("", said(2));
+    EXPECT_EQ(
+        "cimdelta: R:3: warning: this element for class X has no effect: the element at line 2 completed the rules of the class; "
+        "put what is meant into that one\n",
+        said(3));
+    const std::string ten = said(12);
+    EXPECT_EQ(10, std::count(ten.begin(), ten.end(), '\n')) << ten;
+    EXPECT_EQ(0u, said(13).find(ten));
+    EXPECT_EQ("cimdelta: R: 1 more warning; cimdelta check shows all of them\n", said(13).substr(ten.size()));
+    EXPECT_EQ("cimdelta: R: 88 more warnings; cimdelta check shows all of them\n", said(100).substr(ten.size()));
 }
 
 }  // namespace

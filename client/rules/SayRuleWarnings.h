@@ -1,0 +1,17 @@
+#pragma once
+
+#include <boost/smart_ptr/shared_ptr.hpp>
+#include <string>
+
+#include "client/process/IConsole.h"
+#include "client/rules/TRulesDocument.h"
+#include "host/ICIMNamespace.h"
+
+namespace NORVZEL20 {
+
+/// Says each warning of TRuleWarnings in a line of its own, as `name:line: warning: text`. Of very many, only the first ones and
+/// the number of the others. `schema` is the reference, for which the plug-in accepted `document`. Errors: those of the schema.
+void SayRuleWarnings(IConsole& console, const std::string& name, const TRulesDocument& document,
+                     const boost::shared_ptr<ICIMNamespace>& schema);
+
+}  // namespace NORVZEL20
