@@ -76,6 +76,9 @@ void CheckDateTime(std::string_view text)
     const bool isMinusZero = kept.substr(kept.size() - 4) == "-000";
     PromiseEqual(isMinusZero ? kept.substr(0, kept.size() - 4) + "+000" : kept, value.ToText(), "a datetime keeps its text");
     Promise(value == value && !(value < value), "a datetime equals itself");
+    TCIMDateTime canonical;
+    Promise(TCIMDateTime::Parse(value.GetCanonical().ToText(), canonical) && canonical == value,
+            "the canonical form is a datetime and equal", kept);
     const TCIMDateTime epoch;
     Promise((value < epoch) + (epoch < value) + (value == epoch) <= 1, "datetimes have an order");
 }

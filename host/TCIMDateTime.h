@@ -24,6 +24,13 @@ class CIMDELTA_EXPORT TCIMDateTime {
     /// The 25 characters, with the offset and the asterisks that were read. "-000" is written as "+000".
     std::string ToText() const;
 
+    /// The same datetime at the offset next to UTC that can express it. Equal datetimes become the same text.
+    ///
+    /// The offset is +000, with two exceptions. Asterisks stand for what is not known at one offset: the hours of a day of which
+    /// only the date is known lie on two dates of UTC. And years end at 0000 and 9999. Then it is the least offset, and of two
+    /// such offsets the eastern one, at which the unknown fields are the same. An interval has no offset.
+    TCIMDateTime GetCanonical() const noexcept;
+
     bool IsInterval() const noexcept { return fInterval; }
 
     /// True for equal instants, with any offsets, and for equal intervals, if both have asterisks in the same places. An interval

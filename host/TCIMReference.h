@@ -46,12 +46,22 @@ class CIMDELTA_EXPORT TCIMReference {
     /// The path's text: `root/cimv2:Class.Key1="v",Key2=5` (DSP0207, untyped, without authority).
     ///
     /// A path without a namespace is `Class.Key1="v",Key2=5`, one without keys `Class`, one with a host `//host/root/cimv2:...`.
-    /// Bindings come in ascending order of their names in lower case; names keep their spelling. Text, datetimes and the paths of
-    /// references are in double quotes, with `\` in front of each `"` and `\`; char16 is in single quotes, with `\` in front of `'`
-    /// and `\`. Booleans are TRUE and FALSE, reals have the shortest text that reads back the same, null is NULL. One pass.
+    /// Bindings come in ascending order of their names in lower case. Text, datetimes, embedded objects and the paths of references
+    /// are in double quotes, with `\` in front of each `"` and `\`; char16 is in single quotes, with `\` in front of `'` and `\`.
+    /// Booleans are TRUE and FALSE, reals have the shortest text that reads back the same, null is NULL. One pass.
+    ///
+    /// Invariant: two keys of one type are equal by value if and only if their texts are equal, so the text identifies the
+    /// instance. For that, what can be written in several ways is written in one: datetimes in UTC (TCIMDateTime::GetCanonical), -0
+    /// as 0, namespaces and hosts in lower case, embedded objects as in TEmbeddedObject::GetKeyText, and references as their own
+    /// path text. Names of classes and keys keep their spelling, which is the declared one if the class is known; of a class that
+    /// nobody declared it is the written one, and its letter case counts. TCIMValue::IsSameKey is the same relation without the
+    /// texts.
     std::string GetPath() const;
     /// The same text, appended to `out`.
     void AppendPath(std::string& out) const;
+    /// The path for people: the same form, but namespace, host and key values as they were written. Equal paths may have different
+    /// texts.
+    std::string ToText() const;
 
     /// The namespace; null if there is none or it is gone.
     boost::shared_ptr<ICIMNamespace> GetNamespace() const;
@@ -73,18 +83,21 @@ class CIMDELTA_EXPORT TCIMReference {
     /// Reads a path's text, with or without a leading slash or `//host/` (DSP0207) and with or without `namespace:`.
     ///
     /// In quotes any character may have a `\` in front. A number becomes uint64, sint64 (if it has a sign) or real64, text in
-    /// double quotes a string; the store converts them to the key's declared type when it looks the path up. The path gets the
-    /// class that `ns` declares. If `ns` is null or does not declare it, the path gets a stub. Errors: TZELException with
-    /// kParseError (9) if the text is no path; `errorPosition`, if not null, then gets the byte offset.
+    /// double quotes a string. The path gets the class that `ns` declares, and each key of the class its declared spelling and
+    /// type, if the value converts without loss; its text is then that of the instance's own path. If `ns` is null or does not
+    /// declare the class, the path gets a stub. Errors: TZELException with kParseError (9) if the text is no path; `errorPosition`,
+    /// if not null, then gets the byte offset.
     static TCIMReference Parse(const std::string& text, boost::shared_ptr<ICIMNamespace> ns = boost::shared_ptr<ICIMNamespace>(),
                                std::size_t* errorPosition = nullptr);
 
   private:
+    friend class TCIMValue;
     friend class TValueAccess;
     struct TContents;
 
     explicit TCIMReference(TContents* contents) noexcept;
     TContents& Own();
+    void AppendText(std::string& out, TCIMValue::EKeyForm form) const;
     /// The approximate length of the path's text; a text in need of many escapes is longer.
     std::size_t EstimateLength() const;
 

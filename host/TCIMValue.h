@@ -160,18 +160,34 @@ class CIMDELTA_EXPORT alignas(8) TCIMValue {
     bool IsBag() const noexcept;
 
     /// The value for people and reports: text unquoted, numbers in decimal (reals in the shortest text that reads back the same),
-    /// TRUE and FALSE, datetimes in their 25 characters, references as paths, embedded objects as CIM-XML, arrays as {a, b} with
-    /// text quoted, null as NULL. Values that differ only in type may have the same text.
+    /// TRUE and FALSE, datetimes in their 25 characters, references as TCIMReference::ToText, embedded objects as CIM-XML, arrays
+    /// as {a, b} with text quoted, null as NULL. Values that differ only in type may have the same text.
     std::string ToText() const;
 
     /// Appends the value in the form that it has in a path (see TCIMReference::GetPath).
     void AppendKeyText(std::string& out) const;
 
+    /// Whether both values, as keys of one class, name the same instance: they have the same type and the same key text. Except for
+    /// embedded objects and arrays, this is equality by value, and no text is made. An embedded object is the same key as plain
+    /// text that reads like its key text: a path cannot show the difference.
+    bool IsSameKey(const TCIMValue& other) const;
+    /// The same for values that are the same key.
+    std::size_t KeyHash() const;
+
     /// Equal values of the same type have the same hash, except bags: their hash depends on the order of the elements.
     std::size_t Hash() const;
 
   private:
+    friend class TCIMReference;
     friend class TValueAccess;
+
+    /// How a key's text spells what can be written in several ways: in one way, or as it was written.
+    enum class EKeyForm : unsigned char { kCanonical, kWritten };
+
+    void AppendKey(std::string& out, EKeyForm form) const;
+    void AppendKeyElements(std::string& out, EKeyForm form) const;
+    /// Whether equality by value is not the relation of key texts.
+    bool IsKeyByText() const noexcept;
 
     TCIMValue(TCIMType::ECIMType type, unsigned char form) noexcept;
     bool IsShared() const noexcept;

@@ -1,7 +1,8 @@
 // The instances of a class and the index of their keys.
 //
 // Instances stand in a list in order of insertion. An index finds the position of an instance by the hash of its keys; the keys
-// themselves stay in the instances. The keys that count are those with which an instance was added: if a key property is changed
+// themselves stay in the instances. Keys are compared as TCIMValue::IsSameKey does, so two instances are the same here if and only
+// if their paths have the same text. The keys that count are those with which an instance was added: if a key property is changed
 // later, the instance remembers the old value and is still found by it.
 //
 // A removed instance leaves a gap in the list, so positions and the index stay as they are. When more than half of the list are
@@ -26,7 +27,7 @@ constexpr std::size_t kMinCompactedSize = 32;  // gaps in a list up to this leng
 /// The hash of the keys before `key`, which is `seed`, and of `key`.
 std::uint32_t Mix(std::uint32_t seed, const TCIMValue& key)
 {
-    const std::uint64_t hash = key.Hash();
+    const std::uint64_t hash = key.KeyHash();
     return (seed ^ static_cast<std::uint32_t>(hash ^ (hash >> 32))) * 0x01000193U + 0x9e3779b9U;
 }
 
@@ -133,7 +134,7 @@ std::uint32_t TInMemExtent::HashOf(const TInMemInstance& instance) const
 bool TInMemExtent::HasSameKeys(const TInMemInstance& a, const TInMemInstance& b) const
 {
     for (const std::uint32_t slot : fLayout.GetKeys()) {
-        if (a.GetAddedKey(slot) != b.GetAddedKey(slot)) {
+        if (!a.GetAddedKey(slot).IsSameKey(b.GetAddedKey(slot))) {
             return false;
         }
     }
@@ -150,7 +151,7 @@ boost::shared_ptr<TInMemInstance> TInMemExtent::Find(const std::vector<TCIMValue
     const std::vector<std::uint32_t>& slots = fLayout.GetKeys();
     const auto isSame = [&](std::uint32_t ordinal) {
         for (std::size_t at = 0; at < keys.size(); ++at) {
-            if (fInstances[ordinal]->GetAddedKey(slots[at]) != keys[at]) {
+            if (!fInstances[ordinal]->GetAddedKey(slots[at]).IsSameKey(keys[at])) {
                 return false;
             }
         }

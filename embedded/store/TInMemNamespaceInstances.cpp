@@ -19,7 +19,7 @@ TCIMValue GetKey(const TCIMReference& path, const TInMemPropertyDecl& decl)
         throw TZELException(TZELStatusCode::kKeyMissing);
     }
     TCIMValue key;
-    if (!TValueText::Convert(*bound, decl.GetType(), key)) {
+    if (!TValueText::ConvertKey(*bound, decl.GetType(), key)) {
         throw TZELException(TZELStatusCode::kTypeMismatch);
     }
     return key;
@@ -77,7 +77,7 @@ void TInMemNamespace::ModifyInstance(const TCIMReference& path, TCallContext pro
         // A key may be named, but only with the value that it has.
         if (!layout.GetDecl(slot).IsKey()) {
             changes.emplace_back(slot, std::move(fitting));
-        } else if (instance->GetSlotValue(slot) != fitting) {
+        } else if (!instance->GetSlotValue(slot).IsSameKey(fitting)) {
             throw TZELException(TZELStatusCode::kInvalidParameter);
         }
     }
@@ -94,13 +94,14 @@ void TInMemNamespace::ClearInstances()
     }
 }
 
-/// Only keys that are references have such texts; other classes keep their index.
+/// Only references have such texts, and embedded objects, which are strings; other classes keep their index.
 void TInMemNamespace::ReferenceTextsChanged()
 {
     for (const auto& cls : fClasses) {
         const TInMemLayout& layout = cls->GetLayout();
         for (const std::uint32_t slot : layout.GetKeys()) {
-            if (layout.GetDecl(slot).GetType().GetElementType() == TCIMValue::TCIMType::kReference) {
+            const TCIMValue::TCIMType type = layout.GetDecl(slot).GetType().GetElementType();
+            if (type == TCIMValue::TCIMType::kReference || type == TCIMValue::TCIMType::kString) {
                 cls->GetExtent().KeyTextsChanged();
                 break;
             }

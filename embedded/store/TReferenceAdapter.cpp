@@ -5,8 +5,9 @@
 // itself and with keys of the declared spelling and type. A key may be a reference, so this goes on inside; arrays and the
 // properties of embedded objects are searched too. A value in which nothing changes is not copied.
 //
-// If a reference that is a key changes, its instance has another path. The index of the extent is renewed afterwards, and two
-// instances may turn out to have one path, if their keys differed in nothing but the spelling of a name.
+// If a reference that is a key, or in an embedded object that is one, changes, its instance has another path. The index of the
+// extent is renewed afterwards, and two instances may turn out to have one path, if their keys differed in nothing but the spelling
+// of a name.
 
 #include "embedded/store/TReferenceAdapter.h"
 
@@ -61,10 +62,7 @@ std::vector<std::uint32_t> FindSlotsToAdapt(const TInMemClass& cls)
     for (const std::uint32_t slot : cls.GetLayout().GetOrder()) {
         const TInMemPropertyDecl& decl = cls.GetLayout().GetDecl(slot);
         const TType::ECIMType type = decl.GetType().GetElementType();
-        if (decl.IsStatic()) {
-            continue;
-        }
-        if (type == TType::kReference || (type == TType::kString && !decl.IsKey())) {
+        if (!decl.IsStatic() && (type == TType::kReference || type == TType::kString)) {
             slots.push_back(slot);
         }
     }
@@ -99,7 +97,7 @@ const TInMemPropertyDecl* TReferenceAdapter::AdaptKey(const TInMemClass& cls, st
     const TInMemPropertyDecl& decl = cls.GetLayout().GetDecl(slot);
     name = decl.GetName();
     TCIMValue adapted;
-    if (value.GetType() != decl.GetType() && TValueText::Convert(value, decl.GetType(), adapted)) {
+    if (value.GetType() != decl.GetType() && TValueText::ConvertKey(value, decl.GetType(), adapted)) {
         value = adapted;
     }
     return &decl;

@@ -8,6 +8,10 @@
 // value. Two datetimes are equal if their microseconds and their bits are. Writing goes the way back and then puts the asterisks
 // over the unknown fields.
 //
+// The canonical offset depends only on what equality compares, so equal datetimes have the same canonical text: it is the first of
+// 0, 1, -1, 2, -2, ... at which every unknown field has its least value and the year has four digits. The offset that was read
+// fits, so the search ends. Nearly always 0 fits at once.
+//
 // Days are counted in years that begin on March 1, which puts the leap day at the end of a year, and in eras of 400 such years
 // with 146,097 days each. From the beginning of era 0 to 1970-01-01 there are 719,468 days.
 
@@ -125,6 +129,33 @@ TDate GetDate(std::int64_t days) noexcept
     return {yearOfEra + era * 400 + (month <= 2 ? 1 : 0), month, dayOfYear - (153 * shifted + 2) / 5 + 1};
 }
 
+struct TDays {
+    std::int64_t days;
+    std::int64_t rest;  // microseconds of the day, never negative
+};
+
+TDays GetWholeDays(std::int64_t microseconds) noexcept
+{
+    // Before 1970 the division rounds up, but a day begins at the earlier midnight.
+    const bool isBefore = microseconds % kDay < 0;
+    return {microseconds / kDay - (isBefore ? 1 : 0), microseconds % kDay + (isBefore ? kDay : 0)};
+}
+
+/// Whether a text of the local time `local` can have asterisks over the fields of `unknown`. No offset changes the seconds.
+bool IsExpressible(std::int64_t local, unsigned int unknown) noexcept
+{
+    const TDays time = GetWholeDays(local);
+    const TDate date = GetDate(time.days);
+    const std::array<std::int64_t, 5> values{date.year, date.month, date.day, time.rest / kHour, time.rest % kHour / kMinute};
+    for (std::size_t i = 0; i < values.size(); ++i) {
+        const TField& field = kTimestampFields[i];
+        if ((unknown & (1u << field.bit)) != 0 && values[i] != field.least) {
+            return false;
+        }
+    }
+    return date.year >= kTimestampFields[0].least && date.year <= kTimestampFields[0].greatest;
+}
+
 /// Adds the interval to `microseconds`, which has its fraction of a second already. ReadTimestamp does the same.
 bool ReadInterval(std::string_view text, std::int64_t& microseconds, std::uint16_t& unknown) noexcept
 {
@@ -207,16 +238,22 @@ bool TCIMDateTime::Parse(std::string_view text, TCIMDateTime& result) noexcept
     return isRead;
 }
 
+TCIMDateTime TCIMDateTime::GetCanonical() const noexcept
+{
+    TCIMDateTime canonical = *this;
+    if (fOffset == 0) {
+        return canonical;
+    }
+    canonical.fOffset = 0;
+    while (!IsExpressible(fMicroseconds + canonical.fOffset * kMinute, fUnknown)) {
+        canonical.fOffset = static_cast<std::int16_t>(canonical.fOffset > 0 ? -canonical.fOffset : 1 - canonical.fOffset);
+    }
+    return canonical;
+}
+
 std::string TCIMDateTime::ToText() const
 {
-    const std::int64_t local = fMicroseconds + fOffset * kMinute;
-    // Before 1970 the division rounds up, but a day begins at the earlier midnight.
-    std::int64_t days = local / kDay;
-    std::int64_t rest = local % kDay;
-    if (rest < 0) {
-        rest += kDay;
-        --days;
-    }
+    const auto [days, rest] = GetWholeDays(fMicroseconds + fOffset * kMinute);
     std::string text(kLength, '.');
     WriteDigits(&text[8], 2, rest / kHour);
     WriteDigits(&text[10], 2, rest % kHour / kMinute);

@@ -5,8 +5,9 @@
 //
 // The text is `//host/namespace:Class.Key="value",Other=5`. Text, datetimes, embedded objects and the paths of references are in
 // double quotes, char16 in single quotes. Only two characters are escaped, each by a backslash in front of it: the backslash and
-// the quote that is in use. Because bindings are sorted and escaped, paths with different bindings have different texts. That is
-// why a text can decide whether two references are equal and can be the key under which an instance is found.
+// the quote that is in use. Because bindings are sorted and escaped, paths with different bindings have different texts. Because
+// values that can be written in several ways are written in one (TCIMValue::AppendKey), equal keys have equal texts. So a text can
+// decide whether two references are equal and can be the key under which an instance is found.
 
 #include "host/TCIMReference.h"
 
@@ -14,6 +15,7 @@
 #include <boost/smart_ptr/make_shared.hpp>
 
 #include "embedded/value/ILocated.h"
+#include "embedded/value/TEmbeddedObject.h"
 #include "embedded/value/TNameText.h"
 #include "embedded/value/TReferenceContents.h"
 #include "embedded/value/TStubClass.h"
@@ -33,6 +35,22 @@ const std::string& GetEmptyText()
 {
     static const std::string* const fgEmpty = new std::string;
     return *fgEmpty;
+}
+
+void AppendPlace(std::string& out, const std::string& host, const std::string& namespaceName)
+{
+    if (!host.empty()) {
+        out.append("//").append(host).append(1, '/');
+    }
+    if (!namespaceName.empty()) {
+        out.append(namespaceName).append(1, ':');
+    }
+}
+
+void LowerFrom(std::string& out, std::size_t start)
+{
+    const auto from = out.begin() + static_cast<std::ptrdiff_t>(start);
+    std::transform(from, out.end(), from, [](char c) { return TNameText::ToLower(c); });
 }
 
 }  // namespace
@@ -157,20 +175,33 @@ std::size_t TCIMReference::EstimateLength() const
 
 void TCIMReference::AppendPath(std::string& out) const
 {
+    AppendText(out, TCIMValue::EKeyForm::kCanonical);
+}
+
+std::string TCIMReference::ToText() const
+{
+    std::string text;
+    AppendText(text, TCIMValue::EKeyForm::kWritten);
+    return text;
+}
+
+void TCIMReference::AppendText(std::string& out, TCIMValue::EKeyForm form) const
+{
     if (fContents == nullptr) {
         return;
     }
-    if (!GetHost().empty()) {
-        out.append("//").append(GetHost()).append(1, '/');
-    }
-    if (!GetNamespaceName().empty()) {
-        out.append(GetNamespaceName()).append(1, ':');
+    if (fContents->place) {
+        const std::size_t start = out.size();
+        AppendPlace(out, GetHost(), GetNamespaceName());
+        if (form == TCIMValue::EKeyForm::kCanonical) {
+            LowerFrom(out, start);
+        }
     }
     out += GetClassName();
     char separator = '.';
     for (const TContents::TBinding& binding : fContents->bindings) {
         out.append(1, separator).append(binding.first).append(1, '=');
-        binding.second.AppendKeyText(out);
+        binding.second.AppendKey(out, form);
         separator = ',';
     }
 }
@@ -246,6 +277,14 @@ unsigned int TCIMReference::TContents::GetDepth(const TCIMValue& value)
         unsigned int depth = 0;
         for (const TCIMValue& element : value.GetElements()) {
             depth = std::max(depth, GetDepth(element));
+        }
+        return depth;
+    }
+    case TValueAccess::kObject: {
+        // A key text quotes the paths within an object like those within an array.
+        unsigned int depth = 0;
+        for (const TEmbeddedObject::TProperty& property : value.GetEmbeddedObject()->GetProperties()) {
+            depth = std::max(depth, GetDepth(property.value));
         }
         return depth;
     }

@@ -15,7 +15,9 @@
 #include "embedded/value/TNameText.h"
 #include "embedded/value/TReferenceContents.h"
 #include "embedded/value/TStubClass.h"
+#include "embedded/value/TValueAccess.h"
 #include "embedded/value/TValueText.h"
+#include "host/ICIMClass.h"
 #include "host/TZELException.h"
 
 namespace NORVZEL20 {
@@ -214,6 +216,49 @@ boost::shared_ptr<ICIMClass> FindClass(ICIMNamespace& ns, const std::string& nam
     }
 }
 
+/// Null if the class does not declare the property.
+boost::shared_ptr<ICIMPropertyDecl> FindProperty(const ICIMClass& cls, const std::string& name)
+{
+    try {
+        return cls.GetPropertyDecl(name, TCallContext());
+    } catch (const TZELException& failure) {
+        if (failure.GetStatusCode() != TZELStatusCode::kNotFound) {
+            throw;
+        }
+        return nullptr;
+    }
+}
+
+/// The path that a key's text holds, in the spelling of its class; the text itself if it holds none.
+TCIMValue ReadPath(const TCIMValue& text, const boost::shared_ptr<ICIMNamespace>& ns)
+{
+    try {
+        return TCIMValue(TCIMReference::Parse(std::string(text.GetString()), ns));
+    } catch (const TZELException& failure) {
+        if (failure.GetStatusCode() != TZELStatusCode::kParseError) {
+            throw;
+        }
+        return text;
+    }
+}
+
+/// Gives a key the declared spelling and type, if its value converts.
+void Adapt(TPathReader::TBinding& key, const ICIMClass& cls, const boost::shared_ptr<ICIMNamespace>& ns)
+{
+    const boost::shared_ptr<ICIMPropertyDecl> decl = FindProperty(cls, key.name);
+    if (!decl) {
+        return;
+    }
+    key.name = decl->GetName(TCallContext());
+    const TCIMValue::TCIMType type = decl->GetType(TCallContext());
+    TCIMValue adapted;
+    if (type == TCIMValue::TCIMType::kReference && TValueAccess::IsText(key.value)) {
+        key.value = ReadPath(key.value, ns);
+    } else if (TValueText::ConvertKey(key.value, type, adapted)) {
+        key.value = adapted;
+    }
+}
+
 }  // namespace
 
 TCIMReference TCIMReference::Parse(const std::string& text, boost::shared_ptr<ICIMNamespace> ns, std::size_t* errorPosition)
@@ -235,14 +280,21 @@ TCIMReference TCIMReference::Parse(const std::string& text, boost::shared_ptr<IC
         path.SetNamespaceName(std::string(reader.GetNamespaceName()));
     }
     const std::string className(reader.GetClassName());
-    path.SetClass(ns && !className.empty() ? FindClass(*ns, className) : nullptr);
-    if (!path.fContents->cls) {
+    const boost::shared_ptr<ICIMClass> cls = ns && !className.empty() ? FindClass(*ns, className) : nullptr;
+    path.SetClass(cls);
+    if (!cls) {
         path.SetClassName(className);
     }
-    // The bindings are sorted, have no duplicates and hold no references, so AddKeyValue has nothing to check or to find.
+    // The bindings are sorted and have no duplicates, so each is added at the end.
     path.fContents->bindings.reserve(reader.GetBindings().size());
     for (TPathReader::TBinding& binding : reader.GetBindings()) {
-        path.fContents->bindings.emplace_back(std::move(binding.name), std::move(binding.value));
+        const TCIMValue read = binding.value;
+        if (cls) {
+            Adapt(binding, *cls, ns);
+        }
+        // Text in quotes may hold paths that nest too deeply. It stays text then.
+        const bool isTooDeep = TContents::GetDepth(binding.value) > TContents::kMaxDepth;
+        path.AddKeyValue(binding.name, isTooDeep ? read : binding.value);
     }
     return path;
 }

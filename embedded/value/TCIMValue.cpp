@@ -318,7 +318,7 @@ std::string TCIMValue::ToText() const
         AppendElements(text, GetElements());
         break;
     case TAccess::kPath:
-        text = TAccess::GetPath(*this).GetPath();
+        text = TAccess::GetPath(*this).ToText();
         break;
     default:
         TValueText::AppendPlain(text, *this);
@@ -327,9 +327,16 @@ std::string TCIMValue::ToText() const
     return text;
 }
 
-/// Different keys must have different texts, so text is quoted and escaped here, unlike in ToText.
 void TCIMValue::AppendKeyText(std::string& out) const
 {
+    AppendKey(out, EKeyForm::kCanonical);
+}
+
+/// Different keys must have different texts, so text is quoted and escaped here, unlike in ToText. Equal keys must have equal
+/// texts, so the canonical form has one spelling for each.
+void TCIMValue::AppendKey(std::string& out, EKeyForm form) const
+{
+    const bool isCanonical = form == EKeyForm::kCanonical;
     switch (fForm) {
     case TAccess::kShortText:
     case TAccess::kSharedText:
@@ -339,22 +346,45 @@ void TCIMValue::AppendKeyText(std::string& out) const
         if (fType == TCIMType::kChar16) {
             TValueText::AppendQuoted(out, ToText(), '\'');
         } else if (TTypeKind::IsReal(fType) && TAccess::GetReal(*this) == 0) {
-            out += '0';  // equal values have equal paths, and -0 equals 0
+            out += '0';  // also -0
         } else {
             TValueText::AppendPlain(out, *this);
         }
         break;
     case TAccess::kPath:
-        TValueText::AppendQuotedBy(out, '"', [this](std::string& text) { TAccess::GetPath(*this).AppendPath(text); });
+        TValueText::AppendQuotedBy(out, '"', [&](std::string& text) { TAccess::GetPath(*this).AppendText(text, form); });
         break;
     case TAccess::kDateTime:
+        TValueText::AppendQuoted(out, (isCanonical ? GetDateTime().GetCanonical() : GetDateTime()).ToText(), '"');
+        break;
     case TAccess::kObject:
-        TValueText::AppendQuoted(out, ToText(), '"');
+        TValueText::AppendQuoted(out, isCanonical ? GetEmbeddedObject()->GetKeyText() : ToText(), '"');
+        break;
+    case TAccess::kArray:
+    case TAccess::kBag:
+        AppendKeyElements(out, form);
         break;
     default:
-        out += ToText();
+        out += "NULL";
         break;
     }
+}
+
+void TCIMValue::AppendKeyElements(std::string& out, EKeyForm form) const
+{
+    std::vector<std::string> texts;
+    texts.reserve(GetElements().size());
+    for (const TCIMValue& element : GetElements()) {
+        element.AppendKey(texts.emplace_back(), form);
+    }
+    if (IsBag() && form == EKeyForm::kCanonical) {
+        std::sort(texts.begin(), texts.end());
+    }
+    out += '{';
+    for (std::size_t i = 0; i < texts.size(); ++i) {
+        out.append(i == 0 ? "" : ", ").append(texts[i]);
+    }
+    out += '}';
 }
 
 }  // namespace NORVZEL20

@@ -7,6 +7,9 @@
 // Bags are compared as multisets. Both are sorted by the hashes of their elements; if the sequences of hashes differ, the bags
 // differ. Otherwise each run of equal hashes on the left is paired off with the run on the right. Different elements rarely share
 // a hash, so a run is short or consists of equal elements, and the whole takes n log n steps.
+//
+// As keys, two values are the same if their key texts are. For everything that a key usually is, equality by value is the same
+// relation and needs no texts.
 
 #include <algorithm>
 #include <cmath>
@@ -89,6 +92,13 @@ std::size_t Mix(std::size_t hash, std::size_t more) noexcept
     return (hash ^ more) * 0x9E3779B97F4A7C15u + (more >> 29);
 }
 
+std::string GetKeyText(const TCIMValue& value)
+{
+    std::string text;
+    value.AppendKeyText(text);
+    return text;
+}
+
 }  // namespace
 
 bool TCIMValue::operator==(const TCIMValue& other) const
@@ -148,6 +158,27 @@ std::size_t TCIMValue::Hash() const
     default:
         return std::hash<std::string_view>()(TAccess::GetText(*this));
     }
+}
+
+bool TCIMValue::IsKeyByText() const noexcept
+{
+    return fForm == TAccess::kObject || fForm == TAccess::kArray || fForm == TAccess::kBag;
+}
+
+bool TCIMValue::IsSameKey(const TCIMValue& other) const
+{
+    if (!IsKeyByText() && !other.IsKeyByText()) {
+        return *this == other;
+    }
+    return fType == other.fType && GetKeyText(*this) == GetKeyText(other);
+}
+
+std::size_t TCIMValue::KeyHash() const
+{
+    if (fForm == TAccess::kObject) {
+        return std::hash<std::string_view>()(GetEmbeddedObject()->GetKeyText());  // as plain text
+    }
+    return IsKeyByText() ? std::hash<std::string>()(GetKeyText(*this)) : Hash();
 }
 
 }  // namespace NORVZEL20

@@ -78,6 +78,13 @@ class CIMDELTA_INTERNAL_EXPORT TEmbeddedObject {
     /// An INSTANCE or CLASS element (DSP0201) on one line.
     std::string ToText() const;
 
+    /// The object as the text of a key. Two objects without bags have the same key text if and only if they are equal.
+    ///
+    /// It resembles ToText, but has one spelling and one order for everything that equality ignores: names in lower case, elements
+    /// sorted by name, an instance without its null properties, nothing about origins. Values are exact: nothing is replaced
+    /// because XML could not hold it. A bag has its elements in the order of their texts.
+    std::string GetKeyText() const;
+
   private:
     std::string fClassName;
     std::string fSuperClassName;

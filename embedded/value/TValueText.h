@@ -38,6 +38,10 @@ class CIMDELTA_INTERNAL_EXPORT TValueText {
     /// Returns false, and leaves `result` as it is, for everything else.
     static bool Convert(const TCIMValue& value, TCIMValue::TCIMType type, TCIMValue& result);
 
+    /// Converts a key that was read from a path to the key's declared type: as Convert, or to a real32 that has the same text. 0.1 is
+    /// read as a real64, and no real32 is exactly that number. Returns false, and leaves `result` as it is, for everything else.
+    static bool ConvertKey(const TCIMValue& value, TCIMValue::TCIMType type, TCIMValue& result);
+
     /// The name of a type in CIM-XML: "uint16" for the type and for arrays of it, "reference", "" for kNone.
     static const char* GetTypeName(TCIMValue::TCIMType type) noexcept;
     /// A type for people: "uint16", "uint16[]", "none".

@@ -107,4 +107,21 @@ bool TValueText::Convert(const TCIMValue& value, TCIMValue::TCIMType type, TCIMV
     return ConvertNumber(value, type, result);
 }
 
+bool TValueText::ConvertKey(const TCIMValue& value, TCIMValue::TCIMType type, TCIMValue& result)
+{
+    if (Convert(value, type, result)) {
+        return true;
+    }
+    if (value.GetType() != TType::kReal64 || type != TType::kReal32) {
+        return false;
+    }
+    TCIMValue narrow;
+    const std::string text = value.ToText();
+    if (!Parse(type, text, narrow) || narrow.ToText() != text) {
+        return false;
+    }
+    result = narrow;
+    return true;
+}
+
 }  // namespace NORVZEL20

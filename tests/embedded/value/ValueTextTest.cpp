@@ -216,5 +216,23 @@ TEST(ValueTextTest, TypesAreDescribedWithBracketsForArrays)
     EXPECT_EQ("uint16[]", TValueText::DescribeType(TType::kArrayUint16));
 }
 
+TEST(ValueTextTest, AKeyOfAPathBecomesTheReal32OfTheSameText)
+{
+    const std::pair<TCIMValue, const char*> cases[] = {
+        {TCIMValue(0.1), "0.1"},        {TCIMValue(1e30), "1e+30"}, {TCIMValue(0.5), "0.5"},
+        {TCIMValue(5ul), "5"},          {TCIMValue("0.1"), "0.1"},  {TCIMValue(), "NULL"},
+        {TCIMValue(0.123456789), "no"}, {TCIMValue(1e300), "no"},   {TCIMValue(16777217ul), "no"},
+    };
+    for (const auto& [key, text] : cases) {
+        TCIMValue converted("no");
+        TValueText::ConvertKey(key, TType::kReal32, converted);
+        EXPECT_EQ(text, converted.ToText());
+        EXPECT_EQ(converted.ToText() == "no" ? TType::kString : TType::kReal32, converted.GetType()) << key.ToText();
+    }
+    TCIMValue untouched("no");
+    EXPECT_FALSE(TValueText::ConvertKey(TCIMValue(0.5), TType::kUint8, untouched));
+    EXPECT_EQ("no", untouched.ToText());
+}
+
 }  // namespace
 }  // namespace NORVZEL20
