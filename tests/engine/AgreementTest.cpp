@@ -25,8 +25,9 @@ class AgreementTest : public testing::TestWithParam<EHost> {
 
     void Note(const std::string& outcome)
     {
-        for (const std::string mark :
-             {"\n  1 ", "\n  2 ", "\n  4 ", " -> ", "status 3\n", "status 9\n", "status 15\n", "status 37\n", " 1 1", "[1 3"}) {
+        for (const std::string mark : {"\n  1 ", "\n  2 ", "\n  4 ", " -> ", "status 3\n", "status 9\n", "status 15\n",
+                                       "status 37\n", " 1 1", "[1 3", "=\"<INSTANCE ", "=\"C0.", "=\"2024022911****.******+030\"",
+                                       "=\"00000001000000.000000:000\"", "='", "=-128", "=NaN"}) {
             fSeen[mark] += outcome.find(mark) != std::string::npos ? 1 : 0;
         }
     }

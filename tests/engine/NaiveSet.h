@@ -9,16 +9,41 @@ namespace NORVZEL20 {
 
 // Namespaces and rules as plain data, without any type of the host or the plug-in.
 
-/// A value: null, a number, a text, a list of texts or a path.
+struct TNaiveMember;
+
+/// A value: null, something that one text says, a list of texts, a path or an embedded object.
 struct TNaiveValue {
-    enum class EKind { kNumber, kText, kList, kPath };
+    enum class EKind {
+        kBoolean,
+        kUint8,
+        kSint8,
+        kUint16,
+        kSint16,
+        kUint32,
+        kSint32,
+        kUint64,
+        kSint64,
+        kReal32,
+        kReal64,
+        kChar,  ///< one ASCII character
+        kText,
+        kTime,  ///< a point in time or an interval, in 25 characters
+        kList,
+        kPath,
+        kObject  ///< an embedded instance
+    };
 
     EKind kind = EKind::kText;
     bool isNull = true;
-    unsigned int number = 0;
-    std::string text;                                           // of a path: the class
-    std::vector<std::string> list;                              // of a path: the one namespace, where there is one
-    std::vector<std::pair<std::string, std::string>> pathKeys;  // of a path, all of them texts
+    std::string text;                   // as it was written; of a path and of an object: the class
+    std::vector<std::string> list;      // of a path: the one namespace, if it has one
+    std::vector<TNaiveMember> members;  // of a path: its keys; of an object: its properties
+};
+
+/// A named part of a path or an object.
+struct TNaiveMember {
+    std::string name;
+    TNaiveValue value;
 };
 
 struct TNaiveProperty {

@@ -1,15 +1,48 @@
 #include "tests/engine/RandomSet.h"
 
 #include <algorithm>
+#include <map>
 #include <random>
 
 #include "tests/engine/NaiveRules.h"
+#include "tests/engine/NaiveText.h"
 
 namespace NORVZEL20 {
 
 namespace {
 
 using EKind = TNaiveValue::EKind;
+
+// The texts of the kinds that one text says. Some are equal by value and written in different ways.
+const std::map<EKind, std::vector<std::string>> kTexts = {
+    {EKind::kBoolean, {"TRUE", "FALSE"}},
+    {EKind::kUint8, {"0", "255"}},
+    {EKind::kSint8, {"-128", "0", "127"}},
+    {EKind::kUint16, {"0", "65535"}},
+    {EKind::kSint16, {"-32768", "0"}},
+    {EKind::kUint32, {"0", "1", "2"}},
+    {EKind::kSint32, {"-2147483648", "1"}},
+    {EKind::kUint64, {"0", "18446744073709551615"}},
+    {EKind::kSint64, {"-9223372036854775808", "1"}},
+    {EKind::kReal32, {"0", "-0", "0.1", "NaN"}},
+    {EKind::kReal64, {"0", "-0", "0.1", "1e+300", "NaN", "INF", "-INF"}},
+    {EKind::kChar, {"x", "X", "'", "\\"}},
+    {EKind::kText, {"a", "b", "a\",another0=1", "\\", ""}},
+    {EKind::kTime,
+     {"20240229120000.000000+060", "20240229110000.000000+000", "20240229120000.000000+000", "20240301003000.000000+810",
+      "2024022912****.******+060", "2024022911****.******+000", "2024022912****.******+090", "2024022911****.******+030",
+      "20240229******.******+060", "20240229******.******+000", "00000001000000.000000:000", "000000010000**.******:000"}},
+};
+
+// The kinds that a key may have.
+const std::vector<EKind> kKinds = {EKind::kBoolean, EKind::kUint8,  EKind::kSint8,  EKind::kUint16, EKind::kSint16, EKind::kUint32,
+                                   EKind::kSint32,  EKind::kUint64, EKind::kSint64, EKind::kReal32, EKind::kReal64, EKind::kChar,
+                                   EKind::kText,    EKind::kTime,   EKind::kPath,   EKind::kObject};
+
+TNaiveValue Simple(EKind kind, const std::string& text)
+{
+    return {kind, false, text, {}, {}};
+}
 
 // Makes one set. It uses no distributions of the library, whose results differ between libraries.
 class TGenerator {
@@ -33,6 +66,8 @@ class TGenerator {
     void DropSome(TNaiveNamespace& ns);
     void AddInstances(TNaiveNamespace& ns, const std::string& className);
     TNaiveValue MakeValue(const TNaiveProperty& property);
+    void FillPath(TNaiveValue& value);
+    void FillObject(TNaiveValue& value);
     TNaiveElement MakeElement();
     bool IsThere(const TNaiveNamespace& ns, const TNaiveInstance& instance);
 
@@ -58,7 +93,7 @@ TNaiveSet TGenerator::Make()
 
 void TGenerator::MakeSchema()
 {
-    fSchema.push_back({"KALMO_OperatingSystem", "", {{"Name", EKind::kText, true}, {"OSType", EKind::kNumber, false}}});
+    fSchema.push_back({"KALMO_OperatingSystem", "", {{"Name", EKind::kText, true}, {"OSType", EKind::kUint32, false}}});
     const std::size_t count = 1 + Below(4);
     for (std::size_t number = 0; number < count; ++number) {
         fSchema.push_back(MakeClass(number));
@@ -72,12 +107,16 @@ TNaiveClass TGenerator::MakeClass(std::size_t number)
     if (number > 0 && !OneIn(3)) {
         cls.superName = "C" + std::to_string(Below(number));
     } else {
-        cls.properties = {{"Key" + suffix, EKind::kText, true}, {"another" + suffix, EKind::kNumber, true}};
+        cls.properties = {{"Key" + suffix, EKind::kText, true}, {"another" + suffix, EKind::kUint32, true}};
+        if (OneIn(2)) {
+            cls.properties.push_back({"third" + suffix, OneOf(kKinds), true});
+        }
     }
-    const std::vector<TNaiveProperty> choices = {{"Size" + suffix, EKind::kNumber, false},
+    const std::vector<TNaiveProperty> choices = {{"Size" + suffix, EKind::kUint32, false},
                                                  {"Label" + suffix, EKind::kText, false},
                                                  {"Tags" + suffix, EKind::kList, false},
-                                                 {"Owner" + suffix, EKind::kPath, false}};
+                                                 {"Owner" + suffix, EKind::kPath, false},
+                                                 {"Any" + suffix, OneOf(kKinds), false}};
     for (const auto& choice : choices) {
         if (!OneIn(3)) {
             cls.properties.push_back(choice);
@@ -123,9 +162,7 @@ void TGenerator::AddInstances(TNaiveNamespace& ns, const std::string& className)
     if (className == "KALMO_OperatingSystem") {
         TNaiveInstance system{className, {}, ""};
         system.values["Name"] = MakeValue({"Name", EKind::kText, true});
-        system.values["OSType"].number = 36;
-        system.values["OSType"].kind = EKind::kNumber;
-        system.values["OSType"].isNull = false;
+        system.values["OSType"] = Simple(EKind::kUint32, "36");
         ns.instances.push_back(system);
         return;
     }
@@ -150,7 +187,7 @@ bool TGenerator::IsThere(const TNaiveNamespace& ns, const TNaiveInstance& instan
         for (const auto& property : AllNaiveProperties(ns, instance.className)) {
             const auto& mine = instance.values.at(property.name);
             const auto& theirs = other.values.at(property.name);
-            if (property.isKey && (mine.text != theirs.text || mine.number != theirs.number)) {
+            if (property.isKey && NaiveKeyText(mine) != NaiveKeyText(theirs)) {
                 return false;
             }
         }
@@ -160,34 +197,58 @@ bool TGenerator::IsThere(const TNaiveNamespace& ns, const TNaiveInstance& instan
 
 TNaiveValue TGenerator::MakeValue(const TNaiveProperty& property)
 {
-    static const std::vector<std::string> kTexts = {"a", "b", "a\",another0=1", "\\", ""};
     TNaiveValue value;
     value.kind = property.kind;
-    value.isNull = property.isKey ? !fIsStrict && OneIn(12) : OneIn(5);
+    // The plain host numbers a uint64 key that is null.
+    value.isNull = property.isKey ? !fIsStrict && property.kind != EKind::kUint64 && OneIn(12) : OneIn(5);
     if (value.isNull) {
         return value;
     }
     switch (property.kind) {
-    case EKind::kNumber:
-        value.number = static_cast<unsigned int>(Below(3));
-        break;
-    case EKind::kText:
-        value.text = OneOf(kTexts);
-        break;
     case EKind::kList:
         for (std::size_t count = Below(3); count > 0; --count) {
             value.list.push_back(OneIn(2) ? "x" : "y");
         }
         break;
     case EKind::kPath:
-        value.text = "C0";
-        if (OneIn(3)) {
-            value.list.push_back(OneIn(2) ? "root/other" : "root/third");
-        }
-        value.pathKeys = {{"Key0", OneIn(2) ? "a" : "b\""}, {"another0", OneIn(2) ? "1" : "2"}};
+        FillPath(value);
+        break;
+    case EKind::kObject:
+        FillObject(value);
+        break;
+    default:
+        value.text = OneOf(kTexts.at(property.kind));
         break;
     }
     return value;
+}
+
+void TGenerator::FillPath(TNaiveValue& value)
+{
+    static const std::vector<std::string> kNamespaces = {"root/other", "ROOT/Other", "root/third"};
+    value.text = "C0";
+    if (OneIn(3)) {
+        value.list.push_back(OneOf(kNamespaces));
+    }
+    value.members = {{"Key0", Simple(EKind::kText, OneIn(2) ? "a" : "b\"")},
+                     {"another0", Simple(EKind::kText, OneIn(2) ? "1" : "2")}};
+    if (OneIn(3)) {
+        value.members.push_back({"third0", Simple(EKind::kTime, OneOf(kTexts.at(EKind::kTime)))});
+    }
+}
+
+// Equal objects in different orders and spellings, and a few that differ.
+void TGenerator::FillObject(TNaiveValue& value)
+{
+    value.text = OneIn(2) ? "Setting" : "SETTING";
+    value.members = {{OneIn(2) ? "Size" : "SIZE", Simple(EKind::kUint32, OneIn(2) ? "1" : "2")},
+                     {OneIn(2) ? "Name" : "name", Simple(EKind::kText, OneIn(3) ? "a<\"&" : "b")},
+                     {"At", Simple(EKind::kTime, OneOf(kTexts.at(EKind::kTime)))},
+                     {"Load", Simple(EKind::kReal32, OneIn(2) ? "0" : "-0")}};
+    value.members[3].value.isNull = OneIn(3);
+    if (OneIn(2)) {
+        std::swap(value.members[0], value.members[1]);
+    }
 }
 
 TNaiveElement TGenerator::MakeElement()

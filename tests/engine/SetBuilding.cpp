@@ -1,5 +1,11 @@
 #include "tests/engine/SetBuilding.h"
 
+#include <boost/smart_ptr/make_shared.hpp>
+#include <map>
+#include <stdexcept>
+
+#include "embedded/value/TEmbeddedObject.h"
+#include "embedded/value/TValueText.h"
 #include "tests/engine/NaiveRules.h"
 #include "tests/support/Dump.h"
 #include "tests/support/TCapturingLogger.h"
@@ -13,17 +19,43 @@ using EType = TCIMValue::TCIMType;
 
 EType::ECIMType TypeOf(EKind kind)
 {
-    switch (kind) {
-    case EKind::kNumber:
-        return EType::kUint32;
-    case EKind::kText:
-        return EType::kString;
-    case EKind::kList:
-        return EType::kArrayString;
-    case EKind::kPath:
-        return EType::kReference;
+    static const std::map<EKind, EType::ECIMType> kTypes = {
+        {EKind::kBoolean, EType::kBoolean}, {EKind::kUint8, EType::kUint8},   {EKind::kSint8, EType::kSint8},
+        {EKind::kUint16, EType::kUint16},   {EKind::kSint16, EType::kSint16}, {EKind::kUint32, EType::kUint32},
+        {EKind::kSint32, EType::kSint32},   {EKind::kUint64, EType::kUint64}, {EKind::kSint64, EType::kSint64},
+        {EKind::kReal32, EType::kReal32},   {EKind::kReal64, EType::kReal64}, {EKind::kChar, EType::kChar16},
+        {EKind::kText, EType::kString},     {EKind::kTime, EType::kDateTime}, {EKind::kList, EType::kArrayString},
+        {EKind::kPath, EType::kReference},  {EKind::kObject, EType::kString},
+    };
+    return kTypes.at(kind);
+}
+
+TCIMValue ValueOf(const TNaiveValue& value);
+
+TCIMValue ListOf(const TNaiveValue& value)
+{
+    const std::vector<TCIMValue> elements(value.list.begin(), value.list.end());
+    return TCIMValue(EType(EType::kArrayString), static_cast<unsigned int>(elements.size()), elements);
+}
+
+TCIMValue PathOf(const TNaiveValue& value)
+{
+    TCIMReference path;
+    path.SetNamespaceName(value.list.empty() ? "" : value.list[0]);
+    path.SetClassName(value.text);
+    for (const auto& [name, key] : value.members) {
+        path.AddKeyValue(name, ValueOf(key));
     }
-    return EType::kNone;
+    return TCIMValue(path);
+}
+
+TCIMValue ObjectOf(const TNaiveValue& value)
+{
+    const auto object = boost::make_shared<TEmbeddedObject>(value.text);
+    for (const auto& [name, member] : value.members) {
+        object->AddProperty({name, ValueOf(member), "", 0, "", false, {}});
+    }
+    return TCIMValue(boost::shared_ptr<const TEmbeddedObject>(object));
 }
 
 TCIMValue ValueOf(const TNaiveValue& value)
@@ -31,23 +63,21 @@ TCIMValue ValueOf(const TNaiveValue& value)
     if (value.isNull) {
         return TCIMValue::Null(TypeOf(value.kind));
     }
-    if (value.kind == EKind::kNumber) {
-        return TCIMValue(value.number);
+    switch (value.kind) {
+    case EKind::kList:
+        return ListOf(value);
+    case EKind::kPath:
+        return PathOf(value);
+    case EKind::kObject:
+        return ObjectOf(value);
+    default:
+        break;
     }
-    if (value.kind == EKind::kText) {
-        return TCIMValue(value.text);
+    TCIMValue simple;
+    if (!TValueText::Parse(TypeOf(value.kind), value.text, simple)) {
+        throw std::logic_error(value.text + " is no value of its type");
     }
-    if (value.kind == EKind::kList) {
-        const std::vector<TCIMValue> elements(value.list.begin(), value.list.end());
-        return TCIMValue(EType(EType::kArrayString), static_cast<unsigned int>(elements.size()), elements);
-    }
-    TCIMReference path;
-    path.SetNamespaceName(value.list.empty() ? "" : value.list[0]);
-    path.SetClassName(value.text);
-    for (const auto& [name, key] : value.pathKeys) {
-        path.AddKeyValue(name, TCIMValue(key));
-    }
-    return TCIMValue(path);
+    return simple;
 }
 
 void Build(const TNaiveNamespace& plain, TNamespaceBuilder& builder)
@@ -68,7 +98,7 @@ void Build(const TNaiveNamespace& plain, TNamespaceBuilder& builder)
     }
 }
 
-std::string ListOf(const TNaiveElement& element, bool isIncluded)
+std::string ListTextOf(const TNaiveElement& element, bool isIncluded)
 {
     std::string text;
     for (const auto& [name, included] : element.listed) {
@@ -93,7 +123,7 @@ std::string RulesOf(const TNaiveSet& set)
             keys += " " + key;
         }
         text += keys.empty() ? ">" : " excludekeys=\"" + keys + "\">";
-        text += ListOf(element, true) + ListOf(element, false) + "</class>\n";
+        text += ListTextOf(element, true) + ListTextOf(element, false) + "</class>\n";
     }
     return text + "</DifftoolSpec>\n";
 }

@@ -161,7 +161,7 @@ bool TNaiveRun::AreEqual(const TNaiveValue& master, const TNaiveValue& other) co
     if (master.kind == EKind::kList && fSet.areListsBags) {
         return std::is_permutation(master.list.begin(), master.list.end(), other.list.begin(), other.list.end());
     }
-    return master.number == other.number && master.text == other.text && master.list == other.list;
+    return master.kind == EKind::kList ? master.list == other.list : NaiveKeyText(master) == NaiveKeyText(other);
 }
 
 std::string TNaiveRun::PathOfInstance(const TNaiveNamespace& ns, const TNaiveInstance& instance, const TNaiveRules& rules) const
