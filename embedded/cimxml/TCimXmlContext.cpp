@@ -79,6 +79,39 @@ bool TCimXmlContext::IsOwn(const std::string& name, const std::string& host) con
     return host.empty() || fReport.host.empty() || TNameText::Equal(host, fReport.host);
 }
 
+void TCimXmlContext::MakeLocal(TCIMValue& value) const
+{
+    if (value.IsNull() || value.GetType().GetElementType() != TCIMValue::TCIMType::kReference) {
+        return;
+    }
+    if (!value.GetType().IsArray()) {
+        value = TCIMValue(MakeLocal(static_cast<TCIMReference>(value)));
+        return;
+    }
+    std::vector<TCIMValue> elements = value.GetElements();
+    for (TCIMValue& element : elements) {
+        MakeLocal(element);
+    }
+    value = TCIMValue(value.GetType(), static_cast<unsigned int>(elements.size()), elements);
+}
+
+TCIMReference TCimXmlContext::MakeLocal(const TCIMReference& path) const
+{
+    TCIMReference local(path);
+    path.EnumerateKeyBindings([&](std::pair<std::string, TCIMValue> key) {
+        if (key.second.GetType() == TCIMValue::TCIMType::kReference) {
+            MakeLocal(key.second);
+            local.AddKeyValue(key.first, key.second);
+        }
+        return true;
+    });
+    if (IsOwn(local.GetNamespaceName(), local.GetHost())) {
+        local.SetNamespaceName("");
+        local.SetHost("");
+    }
+    return local;
+}
+
 /// Other characters, such as a dot, a comma or a colon, could make two different paths read the same.
 void TCimXmlContext::CheckName(const char* what, std::string_view name) const
 {

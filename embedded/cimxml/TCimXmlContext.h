@@ -10,6 +10,7 @@
 #include "embedded/cimxml/TPopulateError.h"
 #include "embedded/cimxml/TTextPool.h"
 #include "host/Export.h"
+#include "host/TCIMReference.h"
 
 namespace NORVZEL20 {
 
@@ -64,6 +65,9 @@ class CIMDELTA_INTERNAL_EXPORT TCimXmlContext {
 
     /// Whether a path with that namespace and host (may be empty) stays within the document's own namespace.
     bool IsOwn(const std::string& name, const std::string& host) const;
+    /// Takes the document's own namespace and host out of a reference, out of the references in its keys and out of an array of
+    /// references. Call it for references that were written as text; TCimXmlPathReader does the same for all others.
+    void MakeLocal(TCIMValue& value) const;
 
     TLoadReport& GetReport() noexcept { return fReport; }
     TTextPool& GetTexts() noexcept { return fTexts; }
@@ -93,6 +97,8 @@ class CIMDELTA_INTERNAL_EXPORT TCimXmlContext {
     }
 
   private:
+    TCIMReference MakeLocal(const TCIMReference& path) const;
+
     std::string fFile;
     const TXmlReader* fReader = nullptr;
     TPlace fPlace;  // of the innermost TAt; line 0 if there is none

@@ -72,6 +72,8 @@ void TCimXmlInstanceBuilder::SetProperty(const TCimXmlTarget& target, TCIMValue&
 {
     if (value.GetType() != target.type) {
         value = Convert(target, value);
+        // A reference that was text names a class that may be declared later.
+        metUnknownClass = metUnknownClass || target.type.GetElementType() == TCIMValue::TCIMType::kReference;
     }
     fInstance->SetSlot(target.slot, std::move(value));
     if (!metUnknownClass) {
@@ -96,7 +98,15 @@ TCIMValue TCimXmlInstanceBuilder::Convert(const TCimXmlTarget& target, const TCI
     fContext.Tolerate("other type", "property " + Quote(*target.name) + " of class " + Quote(className) + " is written as " +
                                         TValueText::DescribeType(value.GetType()) + "; taken as the declared " +
                                         TValueText::DescribeType(target.type));
+    Localize(converted);
     return converted;
+}
+
+/// References get the form that their classes declare, as far as they are declared, and lose the document's own namespace.
+void TCimXmlInstanceBuilder::Localize(TCIMValue& value) const
+{
+    TReferenceAdapter(fNamespace).Adapt(value);
+    fContext.MakeLocal(value);
 }
 
 void TCimXmlInstanceBuilder::Fill(const TCimXmlDraft& draft, const TReadObjects& readObjects)
@@ -105,14 +115,13 @@ void TCimXmlInstanceBuilder::Fill(const TCimXmlDraft& draft, const TReadObjects&
     if (!Begin(object.GetClassName().c_str())) {
         fContext.Fail(EStatus::kNotFound, "found an instance of class " + Quote(object.GetClassName()) + kIsNotDeclared);
     }
-    const TReferenceAdapter adapter(fNamespace);
     for (std::size_t index = 0; index < object.GetProperties().size(); ++index) {
         const TCimXmlContext::TAt at(fContext, draft.propertyPlaces[index]);
         const TEmbeddedObject::TProperty& property = object.GetProperties()[index];
         const TCimXmlTarget target = FindProperty(property.name.c_str());
         TCIMValue value = target.isEmbedded ? readObjects(property.value) : property.value;
         // All classes are declared now, so references get their final form at once.
-        adapter.Adapt(value);
+        Localize(value);
         SetProperty(target, std::move(value), false);
     }
 }
@@ -136,7 +145,7 @@ void TCimXmlInstanceBuilder::FillKeys(const TOwnKeys& keys)
         const TInMemPropertyDecl& decl = fLayout->cls->GetLayout().GetDecl(slot);
         TCIMValue converted = value;
         TValueText::Convert(value, decl.GetType(), converted);  // if that fails, SetProperty reports it
-        TReferenceAdapter(fNamespace).Adapt(converted);         // the name was read before classes in front of it were declared
+        Localize(converted);                                    // the name was read before classes in front of it were declared
         const bool isReference = decl.GetType() == TCIMValue::TCIMType::kReference;  // perhaps to a class that is not known yet
         SetProperty({&decl.GetName(), slot, decl.GetType(), false}, std::move(converted), isReference);
         fContext.Tolerate("key from name", "an instance of class " + Quote(fLayout->cls->GetName()) + " leaves out its key " +

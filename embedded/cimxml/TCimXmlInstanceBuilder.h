@@ -51,6 +51,7 @@ class TCimXmlInstanceBuilder {
   private:
     TCimXmlLayout* FindLayout(const char* className);
     TCIMValue Convert(const TCimXmlTarget& target, const TCIMValue& value);
+    void Localize(TCIMValue& value) const;
     void FillKeys(const TOwnKeys& keys);
 
     TCimXmlContext& fContext;

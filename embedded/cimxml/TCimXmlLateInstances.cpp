@@ -13,7 +13,7 @@
 
 namespace NORVZEL20 {
 
-void TCimXmlLateInstances::ResolveReferences(const TInMemNamespace& ns, std::size_t declared)
+void TCimXmlLateInstances::ResolveReferences(const TCimXmlContext& context, const TInMemNamespace& ns, std::size_t declared)
 {
     if (declared == fDeclaredBefore) {
         return;  // what was not known then is not known now
@@ -22,6 +22,7 @@ void TCimXmlLateInstances::ResolveReferences(const TInMemNamespace& ns, std::siz
     for (const auto& [instance, slot] : std::exchange(fReferences, {})) {
         TCIMValue value = instance->GetSlotValue(slot);
         if (adapter.Adapt(value)) {
+            context.MakeLocal(value);  // a key that was text may be a reference now
             instance->SetSlot(slot, std::move(value));
         }
     }

@@ -42,7 +42,7 @@ class TCimXmlLateInstances {
     }
     /// Writes the noted references again, with the keys as their classes declare them. `declared` is how many classes are declared
     /// by now. Call it before TakeHeld.
-    void ResolveReferences(const TInMemNamespace& ns, std::size_t declared);
+    void ResolveReferences(const TCimXmlContext& context, const TInMemNamespace& ns, std::size_t declared);
 
     /// Those that were held and those that waited, each once and in the document's order.
     std::vector<THeld> TakeHeld() noexcept { return std::exchange(fHeld, {}); }

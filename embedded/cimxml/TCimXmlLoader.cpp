@@ -100,7 +100,7 @@ void TCimXmlLoader::Finish(const TReadObjects& readObjects)
 {
     fHasEnded = true;
     fClasses.DeclareAll();
-    fLate.ResolveReferences(*fNamespace, fClasses.CountDeclared());
+    fLate.ResolveReferences(fContext, *fNamespace, fClasses.CountDeclared());
     for (const TCimXmlLateInstances::THeld& held : fLate.TakeHeld()) {
         const TCimXmlContext::TAt at(fContext, held.place);
         Add(held.instance);

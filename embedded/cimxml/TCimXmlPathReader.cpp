@@ -22,6 +22,7 @@
 #include "embedded/store/TSchemaLimits.h"
 #include "embedded/value/TNameText.h"
 #include "embedded/value/TValueText.h"
+#include "embedded/value/Trim.h"
 
 namespace NORVZEL20 {
 
@@ -87,6 +88,10 @@ TCIMReference TCimXmlPathReader::End()
         TCIMValue adapted = value;
         if (!cls || TReferenceAdapter::AdaptKey(*cls, name, adapted) == nullptr) {
             fContext.CheckName("key", name);
+        } else if (adapted.GetType() == TType::kReference && value.GetType() != TType::kReference) {
+            TReferenceAdapter(*fNamespace).Adapt(adapted);
+            fContext.MakeLocal(adapted);
+            fMetUnknownClass = true;  // perhaps: the text names a class that may be declared later
         }
         AddKeyTo(path, name, adapted);
     }
@@ -149,16 +154,18 @@ void TCimXmlPathReader::BeginNamespacePath()
     fHost.clear();
 }
 
+/// Some writers give the whole name in one element, and a slash in front of it.
 void TCimXmlPathReader::AddNamespace(const char* name)
 {
-    if (!fNamespaceName.empty()) {
-        fNamespaceName += '/';
-    }
     if (std::strpbrk(name, ":=\"") != nullptr) {
         fContext.Fail(EStatus::kParseError,
                       "found namespace " + Quote(name) + ", expected a name without colons, equals signs and quotes");
     }
-    fNamespaceName += name;
+    const std::string_view part = Trim(name, "/");
+    if (!fNamespaceName.empty() && !part.empty()) {
+        fNamespaceName += '/';
+    }
+    fNamespaceName += part;
 }
 
 void TCimXmlPathReader::SetHost(std::string_view host)

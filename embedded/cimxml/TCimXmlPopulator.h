@@ -21,7 +21,8 @@ namespace NORVZEL20 {
 /// Names: those of classes, properties and keys consist of ASCII letters, digits, underscores and characters beyond ASCII, so they
 /// cannot be confused with the punctuation of a path.
 /// Values: a property that an instance does not mention is null, even if it has a default. A reference without a namespace, or to
-/// the document's own namespace (and host), is stored without one. All or nothing: if a load throws, the namespace is as it was.
+/// the document's own namespace (and host), is stored without one; letter case, and slashes at both ends of the name, do not count.
+/// All or nothing: if a load throws, the namespace is as it was.
 /// Errors of every load: TPopulateError with the statuses of TNamespacePopulator::PopulateFromXMLFile, or kNotSupported (31) if the
 /// namespace is not one of the provider "inmem"; std::bad_alloc. Nothing is logged.
 /// Threads: use a populator, and a namespace, from one thread at a time; different populators may load into different namespaces

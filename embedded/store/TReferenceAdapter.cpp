@@ -132,6 +132,9 @@ bool TReferenceAdapter::AdaptPath(TCIMValue& value) const
         const std::string nameBefore = name;
         const TCIMValue::TCIMType typeBefore = key.GetType();
         AdaptKey(*cls, name, key);
+        if (key.GetType() != typeBefore) {
+            Adapt(key);  // text may have become a reference
+        }
         isChanged = isChanged || name != nameBefore || key.GetType() != typeBefore;
     }
     if (isChanged) {

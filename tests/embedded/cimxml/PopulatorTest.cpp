@@ -69,6 +69,14 @@ TEST_F(PopulatorTest, ReferencesIntoTheOwnNamespaceAreStoredWithoutIt)
         {"plain", InstanceName("A", "x"), "A.Id=\"x\""},
         {"own", "<LOCALINSTANCEPATH>" + LocalNamespace("ROOT", "here") + InstanceName("A", "x") + "</LOCALINSTANCEPATH>",
          "A.Id=\"x\""},
+        {"slash", "<LOCALINSTANCEPATH>" + LocalNamespace("/root", "here/") + InstanceName("A", "x") + "</LOCALINSTANCEPATH>",
+         "A.Id=\"x\""},
+        {"whole", "<LOCALINSTANCEPATH>" + LocalNamespace("/", "/root/here") + InstanceName("A", "x") + "</LOCALINSTANCEPATH>",
+         "A.Id=\"x\""},
+        {"letter case",
+         "<INSTANCEPATH><NAMESPACEPATH><HOST>H</HOST>" + LocalNamespace("Root", "HERE") + "</NAMESPACEPATH>" +
+             InstanceName("A", "x") + "</INSTANCEPATH>",
+         "A.Id=\"x\""},
         {"own host",
          "<INSTANCEPATH><NAMESPACEPATH><HOST>h</HOST>" + LocalNamespace("root", "here") + "</NAMESPACEPATH>" +
              InstanceName("A", "x") + "</INSTANCEPATH>",
@@ -94,6 +102,39 @@ TEST_F(PopulatorTest, ReferencesIntoTheOwnNamespaceAreStoredWithoutIt)
     EXPECT_EQ("h", report.host);
     for (const auto& row : rows) {
         EXPECT_EQ(row.stored, fLoading.ValueOf("A.Id=\"" + std::string(row.id) + "\"", "R")) << row.id;
+    }
+}
+
+TEST_F(PopulatorTest, ReferencesWrittenAsTextAreStoredLikeAllOthers)
+{
+    const std::pair<const char*, const char*> rows[] = {
+        {"A.Id=\"x\"", "A.Id=\"x\""},
+        {"/ROOT/here:a.ID=\"x\"", "A.Id=\"x\""},
+        {"//H/root/here:A.Id=\"x\"", "A.Id=\"x\""},
+        {"root/there:A.Id=\"x\"", "root/there:A.Id=\"x\""},
+        {"//g/root/here:A.Id=\"x\"", "//g/root/here:A.Id=\"x\""},
+        {"root/here:LATE.id=\"x\"", "Late.Id=\"x\""},
+        {"root/here:LINK.TO=\"/root/here:late.ID=\\\"x\\\"\"", "Link.To=\"Late.Id=\\\"x\\\"\""},
+        {"root/here:Nobody.Id=1", "Nobody.Id=1"},
+    };
+    const std::string link = "<CLASS NAME=\"Link\"><PROPERTY.REFERENCE NAME=\"To\"><QUALIFIER NAME=\"Key\" TYPE=\"boolean\">"
+                             "<VALUE>TRUE</VALUE></QUALIFIER></PROPERTY.REFERENCE></CLASS>";
+    std::string contents =
+        "<NAMESPACEPATH><HOST>h</HOST>" + LocalNamespace("root", "here") + "</NAMESPACEPATH>" + L::Class("A", kReferenceR) + link;
+    for (std::size_t i = 0; i < std::size(rows); ++i) {
+        const std::string text = rows[i].first;
+        contents += L::Instance("A", "value" + std::to_string(i), L::Property("R", "string", text));
+        contents += L::Instance("A", "key" + std::to_string(i),
+                                Reference("<INSTANCENAME CLASSNAME=\"Link\"><KEYBINDING NAME=\"to\"><KEYVALUE>" + text +
+                                          "</KEYVALUE></KEYBINDING></INSTANCENAME>"));
+    }
+    fLoading.Load(L::Group(contents + L::Class("Late")));
+    for (std::size_t i = 0; i < std::size(rows); ++i) {
+        EXPECT_EQ(rows[i].second, fLoading.ValueOf("A.Id=\"value" + std::to_string(i) + "\"", "R")) << rows[i].first;
+        TCIMReference linked;
+        linked.SetClassName("Link");
+        linked.AddKeyValue("To", TCIMValue(TCIMReference::Parse(rows[i].second)));
+        EXPECT_EQ(linked.GetPath(), fLoading.ValueOf("A.Id=\"key" + std::to_string(i) + "\"", "R")) << rows[i].first;
     }
 }
 
