@@ -78,7 +78,7 @@ void TCimXmlLoader::Add(const boost::shared_ptr<TInMemInstance>& instance)
     }
 }
 
-/// The namespace reports only a status; the message has to name the key or the path.
+/// The namespace says what it refuses; the message of a load also says what to do.
 void TCimXmlLoader::Explain(const TZELException& error, const TInMemInstance& instance) const
 {
     const EStatus status = error.GetStatusCode().GetStatus();

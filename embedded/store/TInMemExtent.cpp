@@ -16,7 +16,7 @@
 #include <limits>
 #include <new>
 
-#include "host/TZELException.h"
+#include "embedded/store/TStoreRefusal.h"
 
 namespace NORVZEL20 {
 
@@ -84,10 +84,12 @@ void TInMemExtent::Check(const TInMemInstance& instance) const
 void TInMemExtent::CheckKeysAreSet(const TInMemInstance& instance) const
 {
     if (instance.IsAdded()) {
-        throw TZELException(TZELStatusCode::kInvalidParameter);
+        throw TStoreRefusal(TZELStatusCode::kInvalidParameter,
+                            [&] { return "instance " + TStoreRefusal::Shown(instance.GetReference()) + " is added already"; });
     }
-    if (instance.FindMissingKey()) {
-        throw TZELException(TZELStatusCode::kKeyMissing);
+    if (const std::string* const missing = instance.FindMissingKey()) {
+        throw TStoreRefusal(TZELStatusCode::kKeyMissing,
+                            [&] { return "key " + *missing + " of instance " + TStoreRefusal::Shown(instance.GetReference()); });
     }
 }
 
@@ -95,7 +97,8 @@ void TInMemExtent::CheckKeysAreFree(std::uint32_t hash, const TInMemInstance& in
 {
     const auto isSame = [&](std::uint32_t ordinal) { return HasSameKeys(*fInstances[ordinal], instance); };
     if (fIndex.Find(hash, isSame) != THashIndex::kNone) {
-        throw TZELException(TZELStatusCode::kAlreadyExists);
+        throw TStoreRefusal(TZELStatusCode::kAlreadyExists,
+                            [&] { return "instance " + TStoreRefusal::Shown(instance.GetReference()); });
     }
 }
 

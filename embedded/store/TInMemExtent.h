@@ -30,7 +30,8 @@ class TInMemExtent {
     ~TInMemExtent();
 
     /// Adds `instance`, which must be of this class. Errors: kAlreadyExists (12) if an instance with the same keys is there,
-    /// kKeyMissing (14), kInvalidParameter (5) if it is in an extent already; nothing is added then.
+    /// kKeyMissing (14), kInvalidParameter (5) if it is in an extent already; nothing is added then. The exception is a
+    /// TStoreRefusal.
     void Add(const boost::shared_ptr<TInMemInstance>& instance);
     /// Checks that Add would succeed. Errors: those of Add.
     void Check(const TInMemInstance& instance) const;

@@ -31,7 +31,7 @@ class CIMDELTA_EXPORT TInMemInstance final : public ICIMInstance, public boost::
     /// Checks that AddToNamespace would succeed. Errors: those of AddToNamespace.
     void Validate(TCallContext context) const override;
     /// Generated keys that are null get the next number of the class first. Errors: also kInvalidParameter (5) if it is in a
-    /// namespace.
+    /// namespace. A TStoreRefusal says which instance and which key.
     void AddToNamespace(TCallContext context) override;
     TCIMReference GetReference(TCallContext context) const override;
     boost::shared_ptr<ICIMClass> GetClass(TCallContext context) const override;

@@ -10,6 +10,7 @@
 
 #include "embedded/store/TInMemExtent.h"
 #include "embedded/store/TInMemNamespaceProvider.h"
+#include "embedded/store/TStoreRefusal.h"
 #include "embedded/value/EraseLast.h"
 #include "embedded/value/Trim.h"
 #include "host/RootClassName.h"
@@ -116,7 +117,7 @@ TInMemClass& TInMemNamespace::GetParent(const TInMemClass& cls) const noexcept
 void TInMemNamespace::CheckDeclarable(const TInMemClass& cls) const
 {
     if (FindClass(cls.GetName())) {
-        throw TZELException(TZELStatusCode::kAlreadyExists);
+        throw TStoreRefusal(TZELStatusCode::kAlreadyExists, [&] { return "class " + cls.GetName(); });
     }
     const TInMemClass* const superClass = cls.GetSuperInMemClass().get();
     if (!superClass) {
@@ -172,7 +173,7 @@ void TInMemNamespace::AddQualifierDecl(boost::shared_ptr<TInMemQualifierDecl> de
     // A view of the name in the object, which the list keeps alive after the move below.
     const std::string_view name = decl->GetName();
     if (FindQualifierDecl(name)) {
-        throw TZELException(TZELStatusCode::kAlreadyExists);
+        throw TStoreRefusal(TZELStatusCode::kAlreadyExists, [&] { return "qualifier " + std::string(name); });
     }
     fQualifierDecls.push_back(decl);
     try {

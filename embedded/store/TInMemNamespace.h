@@ -53,7 +53,7 @@ class CIMDELTA_EXPORT TInMemNamespace final : public ICIMNamespace,
                    const boost::function<bool(boost::shared_ptr<ICIMInstance>)>& callback, TCallContext context) override;
     /// The path's class and keys count, its namespace and host do not. Key values are converted to the declared types if nothing is
     /// lost by it, so a path read from text finds what it names. Errors: kNotFound (15), kTypeMismatch (13) if a key cannot be
-    /// converted, kKeyMissing (14) if the path lacks one.
+    /// converted, kKeyMissing (14) if the path lacks one. A TStoreRefusal says which path and which key.
     boost::shared_ptr<ICIMInstance> GetInstance(const TCIMReference& path, TCallContext context) const override;
     /// Errors: those of GetInstance.
     void DeleteInstance(const TCIMReference& path, TCallContext context) override;

@@ -5,8 +5,8 @@
 
 #include "embedded/store/TInMemExtent.h"
 #include "embedded/store/TInMemNamespace.h"
+#include "embedded/store/TStoreRefusal.h"
 #include "embedded/value/TValueText.h"
-#include "host/TZELException.h"
 
 namespace NORVZEL20 {
 
@@ -16,11 +16,15 @@ TCIMValue GetKey(const TCIMReference& path, const TInMemPropertyDecl& decl)
 {
     const TCIMValue* const bound = path.FindKeyValue(decl.GetName());
     if (!bound) {
-        throw TZELException(TZELStatusCode::kKeyMissing);
+        throw TStoreRefusal(TZELStatusCode::kKeyMissing,
+                            [&] { return "key " + decl.GetName() + " of path " + TStoreRefusal::Shown(path); });
     }
     TCIMValue key;
     if (!TValueText::ConvertKey(*bound, decl.GetType(), key)) {
-        throw TZELException(TZELStatusCode::kTypeMismatch);
+        throw TStoreRefusal(TZELStatusCode::kTypeMismatch, [&] {
+            return "key " + decl.GetName() + " of path " + TStoreRefusal::Shown(path) + " is no " +
+                   TValueText::DescribeType(decl.GetType());
+        });
     }
     return key;
 }
@@ -47,7 +51,7 @@ boost::shared_ptr<TInMemInstance> TInMemNamespace::RequireInstance(const TCIMRef
 {
     auto instance = FindInstance(path);
     if (!instance) {
-        throw TZELException(TZELStatusCode::kNotFound);
+        throw TStoreRefusal(TZELStatusCode::kNotFound, [&] { return "instance " + TStoreRefusal::Shown(path); });
     }
     return instance;
 }
@@ -71,14 +75,18 @@ void TInMemNamespace::ModifyInstance(const TCIMReference& path, TCallContext pro
     for (const auto& [name, value] : properties) {
         const std::uint32_t slot = layout.FindSlot(name);
         if (slot == TInMemLayout::kNoSlot) {
-            throw TZELException(TZELStatusCode::kNotFound);
+            throw TStoreRefusal(TZELStatusCode::kNotFound, [&, &wanted = name] {
+                return "property " + wanted + " of instance " + TStoreRefusal::Shown(path);
+            });
         }
         TCIMValue fitting = layout.GetDecl(slot).Fit(value);
         // A key may be named, but only with the value that it has.
         if (!layout.GetDecl(slot).IsKey()) {
             changes.emplace_back(slot, std::move(fitting));
         } else if (!instance->GetSlotValue(slot).IsSameKey(fitting)) {
-            throw TZELException(TZELStatusCode::kInvalidParameter);
+            throw TStoreRefusal(TZELStatusCode::kInvalidParameter, [&, &wanted = name] {
+                return "another value for key " + wanted + " of instance " + TStoreRefusal::Shown(path);
+            });
         }
     }
     // All values fit; only now is the first one set.

@@ -125,5 +125,36 @@ TEST_P(TwoNamespacesTest, WithThreeTheReferenceIsLeftAsItIs)
     EXPECT_EQ(0u, fComparison.GetWatch().CountOf("Mark") + fComparison.GetWatch().CountOf("ns0:new"));
 }
 
+using TDiskProperties = std::vector<TNamespaceBuilder::TProperty>;
+
+// The text of what a run throws if the two namespaces declare Disk like this and the second one has an instance for each bay.
+std::string RefusalOf(const TDiskProperties& reference, const TDiskProperties& other, const std::vector<TCIMValue>& bays)
+{
+    TComparisonRun comparison(EHost::kInmem);
+    comparison.Namespace(0).Class("Disk", "", reference);
+    comparison.Namespace(1).Class("Disk", "", other);
+    for (const TCIMValue& bay : bays) {
+        comparison.Namespace(1).Instance("Disk", {{"Id", "sda"}, {"Bay", bay}});
+    }
+    comparison.Rules("<DifftoolSpec version=\"1.0\"><class name=\"Disk\" default=\"include\"/></DifftoolSpec>");
+    comparison.Prepare();
+    try {
+        comparison.Delta().FindDifferences();
+    } catch (const TZELException& refusal) {
+        return refusal.what();
+    }
+    return "";
+}
+
+TEST(CopyingTest, WhatTheStoreRefusesReachesTheCallerWithItsText)
+{
+    const auto id = TNamespaceBuilder::Key("Id");
+    const auto bay = TNamespaceBuilder::Property("Bay", TCIMValue::TCIMType::kUint32);
+    const auto keyBay = TNamespaceBuilder::Key("Bay", TCIMValue::TCIMType::kUint32);
+    EXPECT_EQ("Already exists: instance Disk.Id=\"sda\"", RefusalOf({id, bay}, {id, keyBay}, {TCIMValue(1u), TCIMValue(2u)}));
+    EXPECT_EQ("Key without a value: key Bay of instance Disk.Bay=NULL,Id=\"sda\"",
+              RefusalOf({id, keyBay}, {id, bay}, {TCIMValue::Null(TCIMValue::TCIMType::kUint32)}));
+}
+
 }  // namespace
 }  // namespace NORVZEL20

@@ -96,5 +96,20 @@ TEST_F(SchemaConflictTest, TypesAndKeysThatDifferAreReportedInJson)
     EXPECT_NE(std::string::npos, Compare(one, other, {"-o", "json"}).find("    \"schema\": [\n" + notes)) << fOut;
 }
 
+TEST_F(SchemaConflictTest, AnInstanceThatTheReferenceCannotTakeOverIsNamed)
+{
+    const std::string oneKey = Document(System() + Class("Disk", "", KeyProperty("Id") + Declaration("Bay", "string")) +
+                                        Instance("Disk", Value("Id", "a")));
+    const std::string twoKeys =
+        Document(System() + Class("Disk", "", KeyProperty("Id") + KeyProperty("Bay")) +
+                 Instance("Disk", Value("Id", "b") + Value("Bay", "1")) + Instance("Disk", Value("Id", "b") + Value("Bay", "2")));
+    EXPECT_EQ("cimdelta: the comparison failed: Key without a value: key Bay of instance Disk.Bay=NULL,Id=\"a\"; without "
+              "--strict-schema, cimdelta declares and makes what is missing\n",
+              Compare(twoKeys, oneKey, {"--strict-schema"}));
+    EXPECT_EQ("cimdelta: the comparison failed: Already exists: instance Disk.Id=\"b\"; without --strict-schema, cimdelta declares "
+              "and makes what is missing\n",
+              Compare(oneKey, twoKeys, {"--strict-schema"}));
+}
+
 }  // namespace
 }  // namespace NORVZEL20

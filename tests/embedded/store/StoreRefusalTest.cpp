@@ -1,0 +1,121 @@
+#include <new>
+#include <type_traits>
+
+#include "embedded/store/TStoreRefusal.h"
+#include "tests/embedded/store/TInMemFixture.h"
+
+namespace NORVZEL20 {
+namespace {
+
+static_assert(std::is_nothrow_copy_constructible_v<TStoreRefusal>, "an exception is copied while it is thrown");
+
+/// Disk { Id key; Bay key }, with one instance.
+class StoreRefusalTest : public TInMemFixture {
+  protected:
+    StoreRefusalTest()
+    {
+        fDisk = Declare("Disk", nullptr,
+                        {{"Id", TType::kString, {"Key"}}, {"Bay", TType::kUint8, {"Key"}}, {"Size", TType::kUint64, {}}});
+        fStored = AddDisk("sda");
+    }
+
+    TInstancePointer AllocateDisk(const std::string& id)
+    {
+        return Allocate(fDisk, {{"Id", TCIMValue(id)}, {"Bay", TCIMValue(static_cast<unsigned char>(1))}});
+    }
+
+    TInstancePointer AddDisk(const std::string& id)
+    {
+        auto disk = AllocateDisk(id);
+        disk->AddToNamespace(kNoContext);
+        return disk;
+    }
+
+    /// The text of the refusal that the call throws; "" if it throws nothing.
+    template <class TCall>
+    static std::string RefusalOf(TCall call)
+    {
+        try {
+            call();
+        } catch (const TStoreRefusal& refusal) {
+            return refusal.what();
+        }
+        return "";
+    }
+
+    TClassPointer fDisk;
+    TInstancePointer fStored;
+};
+
+TEST_F(StoreRefusalTest, AnInstanceThatCannotBeAddedIsNamedWithItsKeys)
+{
+    const auto keyless = Allocate(fDisk, {{"Id", TCIMValue("sdb")}});
+    EXPECT_EQ("Already exists: instance Disk.Bay=1,Id=\"sda\"", RefusalOf([&] { AddDisk("sda"); }));
+    EXPECT_EQ("Already exists: instance Disk.Bay=1,Id=\"sda\"", RefusalOf([&] { AllocateDisk("sda")->Validate(kNoContext); }));
+    EXPECT_EQ("Key without a value: key Bay of instance Disk.Bay=NULL,Id=\"sdb\"",
+              RefusalOf([&] { keyless->AddToNamespace(kNoContext); }));
+    EXPECT_EQ("Key without a value: key Bay of instance Disk.Bay=NULL,Id=\"sdb\"", RefusalOf([&] { fDisk->AddInstance(keyless); }));
+    EXPECT_EQ("Invalid parameter: instance Disk.Bay=1,Id=\"sda\" is added already",
+              RefusalOf([&] { fStored->AddToNamespace(kNoContext); }));
+    EXPECT_EQ("", RefusalOf([&] { AddDisk("sdb"); }));
+}
+
+TEST_F(StoreRefusalTest, APathThatFindsNothingIsNamed)
+{
+    const std::pair<const char*, const char*> cases[] = {
+        {"root/x:Disk.Id=\"sdz\",Bay=1", "Not found: instance Disk.Bay=1,Id=\"sdz\""},
+        {"Fan.Id=\"1\"", "Not found: instance Fan.Id=\"1\""},
+        {"Disk.Id=\"sda\"", "Key without a value: key Bay of path Disk.Id=\"sda\""},
+        {"Disk.Id=\"sda\",Bay=\"first\"", "Type mismatch: key Bay of path Disk.Bay=\"first\",Id=\"sda\" is no uint8"},
+    };
+    for (const auto& [path, refusal] : cases) {
+        EXPECT_EQ(refusal, RefusalOf([&, &text = path] { fNamespace->GetInstance(Path(text), kNoContext); }));
+        EXPECT_EQ(refusal, RefusalOf([&, &text = path] { fNamespace->DeleteInstance(Path(text), kNoContext); }));
+        EXPECT_EQ(refusal, RefusalOf([&, &text = path] { fNamespace->ModifyInstance(Path(text), {}, kNoContext); }));
+    }
+}
+
+TEST_F(StoreRefusalTest, AChangeThatIsRefusedIsNamed)
+{
+    const TCIMReference path = fStored->GetReference();
+    EXPECT_EQ("Not found: property Weight of instance Disk.Bay=1,Id=\"sda\"", RefusalOf([&] {
+                  fNamespace->ModifyInstance(path, {{"Weight", TCIMValue(1)}}, kNoContext);
+              }));
+    EXPECT_EQ("Invalid parameter: another value for key Id of instance Disk.Bay=1,Id=\"sda\"", RefusalOf([&] {
+                  fNamespace->ModifyInstance(path, {{"Id", TCIMValue("sdb")}}, kNoContext);
+              }));
+}
+
+TEST_F(StoreRefusalTest, ADeclarationThatIsThereIsNamed)
+{
+    const auto declare = [&] {
+        fNamespace->AllocateQualifierDecl("Alias", TCIMValue(false), ICIMQualifierDecl::kScopeProperty,
+                                          ICIMQualifierDecl::kFlavorDefault, kNoContext);
+    };
+    EXPECT_EQ("Already exists: class DISK", RefusalOf([&] { Declare("DISK", nullptr); }));
+    EXPECT_EQ("", RefusalOf(declare));
+    EXPECT_EQ("Already exists: qualifier Alias", RefusalOf(declare));
+}
+
+TEST_F(StoreRefusalTest, ALongPathIsCutOffBetweenCharacters)
+{
+    std::string id;
+    for (int i = 0; i < 100; ++i) {
+        id += "\xE2\x82\xAC";
+    }
+    AddDisk(id);
+    // `Disk.Bay=1,Id="` has 15 bytes, and 61 characters of three bytes fit behind it.
+    EXPECT_EQ("Already exists: instance Disk.Bay=1,Id=\"" + id.substr(0, 61 * 3) + "...", RefusalOf([&] { AddDisk(id); }));
+}
+
+TEST_F(StoreRefusalTest, WithoutMemoryTheStatusIsLeft)
+{
+    const TStoreRefusal refusal(TZELStatusCode::kAlreadyExists, []() -> std::string { throw std::bad_alloc(); });
+    EXPECT_STREQ("Already exists", refusal.what());
+    const TStoreRefusal copy(refusal);
+    EXPECT_STREQ("Already exists", copy.what());
+    EXPECT_EQ(TZELStatusCode::kAlreadyExists, copy.GetStatusCode().GetStatus());
+}
+
+}  // namespace
+}  // namespace NORVZEL20
