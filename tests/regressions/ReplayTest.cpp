@@ -54,32 +54,23 @@ std::string NameOf(const testing::TestParamInfo<TFuzzTarget>& tested)
     return tested.param.name;
 }
 
-class ReplayTest : public testing::TestWithParam<TFuzzTarget> {
-  protected:
-    std::size_t ReplayAll(const std::string& kind)
-    {
-        const TFolder folder = kFuzzFolder / kind / GetParam().name;
-        if (!std::filesystem::exists(folder)) {
-            return 0;
-        }
-        const std::vector<TFolder> files = FilesIn(folder);
-        for (const TFolder& file : files) {
-            EXPECT_EQ("held", Replay(GetParam(), ContentOf(file))) << file;
-        }
-        return files.size();
+/// Replays each file of the folder, which must not be empty.
+void ReplayAll(const TFuzzTarget& target, const TFolder& folder)
+{
+    const std::vector<TFolder> files = FilesIn(folder);
+    EXPECT_FALSE(files.empty()) << "nothing in " << folder;
+    for (const TFolder& file : files) {
+        EXPECT_EQ("held", Replay(target, ContentOf(file))) << file;
     }
-};
+}
+
+class ReplayTest : public testing::TestWithParam<TFuzzTarget> {};
 
 }  // namespace
 
 TEST_P(ReplayTest, SeedsKeepEveryPromise)
 {
-    EXPECT_GT(ReplayAll("corpus"), 0U) << "no seeds in " << kFuzzFolder / "corpus" / GetParam().name;
-}
-
-TEST_P(ReplayTest, FindingsKeepEveryPromise)
-{
-    ReplayAll("found");
+    ReplayAll(GetParam(), kFuzzFolder / "corpus" / GetParam().name);
 }
 
 /// The empty input and each single byte, which a fuzzer tries first.
@@ -93,18 +84,22 @@ TEST_P(ReplayTest, SingleBytesKeepEveryPromise)
 
 INSTANTIATE_TEST_SUITE_P(Targets, ReplayTest, testing::ValuesIn(TFuzzTarget::GetAll()), NameOf);
 
-/// A folder of findings that belongs to no target would be replayed by no test.
-TEST(FindingsTest, EveryFindingIsReplayed)
+/// A target has a folder of findings only if it found something. A folder that belongs to no target would be replayed by no test.
+TEST(FindingsTest, EveryFindingKeepsEveryPromise)
 {
-    std::size_t findings = 0;
+    std::size_t folders = 0;
     for (const TFolder& folder : FilesIn(kFuzzFolder / "found")) {
+        if (folder.filename() == "README.md") {
+            continue;
+        }
         const auto& targets = TFuzzTarget::GetAll();
-        const bool known = std::any_of(targets.begin(), targets.end(),
-                                       [&folder](const TFuzzTarget& target) { return folder.filename() == target.name; });
-        EXPECT_TRUE(known || folder.filename() == "README.md") << folder;
-        findings += known ? FilesIn(folder).size() : 0;
+        const auto target = std::find_if(targets.begin(), targets.end(),
+                                         [&folder](const TFuzzTarget& each) { return folder.filename() == each.name; });
+        ASSERT_NE(targets.end(), target) << folder;
+        ReplayAll(*target, folder);
+        ++folders;
     }
-    RecordProperty("findings", static_cast<int>(findings));
+    EXPECT_GT(folders, 0U) << "no findings in " << kFuzzFolder / "found";
 }
 
 }  // namespace NORVZEL20

@@ -1,7 +1,9 @@
 #include <malloc.h>
 
 #include <cstdio>
+#include <vector>
 
+#include "host/TAddToVectorCallback.h"
 #include "tests/embedded/store/CountedAllocations.h"
 #include "tests/embedded/store/TInMemFixture.h"
 
@@ -80,17 +82,15 @@ TEST_F(InMemMemoryTest, ReadingAPropertyAllocatesNothing)
 {
     const auto cls = DeclarePackage();
     AddPackage(cls, 1);
+    std::vector<boost::shared_ptr<ICIMInstance>> instances;
+    cls->EnumerateInstances(TAddToVectorCallback<ICIMInstance>(&instances), false, kNoContext);
+    ASSERT_EQ(1u, instances.size());
     const std::string name = "architecture";
-    cls->EnumerateInstances(
-        [&](boost::shared_ptr<ICIMInstance> instance) {
-            const std::size_t before = CountedAllocations();
-            const auto property = instance->GetProperty(name, kNoContext);
-            const TCIMValue value = property->GetValue(kNoContext);
-            EXPECT_EQ(before, CountedAllocations());
-            EXPECT_EQ("amd64", value.GetString());
-            return true;
-        },
-        false, kNoContext);
+    const std::size_t before = CountedAllocations();
+    const auto property = instances[0]->GetProperty(name, kNoContext);
+    const TCIMValue value = property->GetValue(kNoContext);
+    EXPECT_EQ(before, CountedAllocations());
+    EXPECT_EQ("amd64", value.GetString());
 }
 
 TEST_F(InMemMemoryTest, AnInstanceIsOneAllocation)
