@@ -24,6 +24,7 @@ constexpr std::size_t kSizes = (sizeof(T) + ...);
 using TParser = TCIMDiffEngine::TDiffXMLParser;
 
 static_assert(kSizes<ICIMElement, ICIMNamedElement, ICIMClass, ICIMNamespace, INamespaceProvider, TZELException> > 0);
+static_assert(kSizes<TZELStatusCode, TXmlParser> > 0);
 static_assert(kSizes<TAddToVectorCallback<ICIMClass>, TAddToVectorCallback<ICIMInstance>, TAddToVectorCallback<ICIMProperty>,
                      TAddToVectorCallback<ICIMPropertyDecl>, TAddKeyNamesToVectorCallback, TAddKeyBindingsToMapCallback> > 0);
 static_assert(kSizes<TDeltaNamespaceProvider, TDeltaNamespace, TDeltaClass, TCallbackWrapClass> > 0);
@@ -31,5 +32,13 @@ static_assert(kSizes<TCIMDiffEngine, TCIMDiffEngine::TDiffClassRules, TCIMDiffEn
                      TCIMDiffEngine::TCompareInstances> > 0);
 static_assert(kSizes<TParser, TParser::TParseState, TParser::TStateStart, TParser::TStateDTS, TParser::TStateClass,
                      TParser::TStateIncludeList, TParser::TStateExcludeList, TParser::TStateValue> > 0);
+
+// The plug-in has values and paths in its own containers, so it knows their sizes.
+static_assert(sizeof(TCIMValue) == 16 && alignof(TCIMValue) == 8);
+static_assert(sizeof(TCIMValue::TCIMType) == 1);
+static_assert(sizeof(TCIMReference) == sizeof(void*) && alignof(TCIMReference) == alignof(void*));
+// It throws and catches these, and derives from the parser.
+static_assert(sizeof(TZELStatusCode) == sizeof(int) && sizeof(TZELException) == 2 * sizeof(void*));
+static_assert(sizeof(TXmlParser) == 2 * sizeof(void*));
 
 }  // namespace NORVZEL20

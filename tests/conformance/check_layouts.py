@@ -3,8 +3,8 @@
 
 Usage: check_layouts.py CLANG ROOT EXPECTED...
 
-Looks at each type that EXPECTED names. Prints the differences and fails where there are any. Exits with 77 (skipped) where there
-is no clang.
+Looks at each type that EXPECTED names. Prints the differences and fails if there are any, or if there is
+no clang.
 """
 
 import re
