@@ -78,6 +78,18 @@ TEST_P(SchemaCheckTest, AClassOfWhichNothingIsComparedIsNotMissed)
     EXPECT_EQ("", fLog.Take());
 }
 
+TEST_P(SchemaCheckTest, APropertyThatAnotherNamespaceLacksEndsTheRunAtItsFirstPair)
+{
+    Namespace(0).Class("Card", "", {TNamespaceBuilder::Key("Id"), TNamespaceBuilder::Property("Speed")});
+    for (const std::size_t index : {1u, 2u}) {
+        Namespace(index).Class("Card", "", {TNamespaceBuilder::Key("Id")}).Instance("Card", {{"Id", "a"}});
+    }
+    EXPECT_EQ("Card\n  2 Card.Id=\"a\" [1 2]\n", RecordsAfterRun()) << "nothing to compare them with";
+    Namespace(0).Instance("Card", {{"Id", "a"}});
+    EXPECT_EQ("Card\n  2 Card.Id=\"a\" [1 2]\nstatus 15\n", RecordsAfterRun());
+    EXPECT_EQ("", fLog.Take());
+}
+
 TEST_P(SchemaCheckTest, AnotherFailureKeepsItsStatus)
 {
     Card(0);

@@ -188,6 +188,23 @@ TEST(UnownedNamespaceTest, ANamespaceThatNobodyOwnsCannotWrap)
     EXPECT_EQ("KALMO_Delta", delta.GetClass("KALMO_Delta", context)->GetName(kNoContext));
 }
 
+TEST(RootTest, TheRootIsThatOfTheStoreWhateverTheIndex)
+{
+    TComparisonRun comparison(EHost::kInmem);
+    comparison.Namespace(0).Class("Disk", "", {TNamespaceBuilder::Key("Id")});
+    comparison.Prepare();
+    TCallContext context;
+    context["nsIndex"] = TCIMValue(static_cast<unsigned short>(0));
+    for (const TCallContext& each : {TCallContext(), context}) {
+        const auto root = comparison.Delta().GetClass("<root>", each);
+        EXPECT_EQ(nullptr, boost::dynamic_pointer_cast<TDeltaClass>(root));
+        std::string names;
+        const auto collect = [&names](boost::shared_ptr<ICIMClass> cls) { return names += cls->GetName(kNoContext) + " ", true; };
+        root->EnumerateSubClasses(collect, false, each);
+        EXPECT_EQ("KALMO_DeltaClass KALMO_Delta KALMO_DeltaClassAssocToDelta ", names);
+    }
+}
+
 TEST(SpellingTest, TwoSpellingsGiveTwoWrappersOfOneClass)
 {
     TComparisonRun comparison(EHost::kInmem);
