@@ -7,6 +7,37 @@
 
 namespace NORVZEL20 {
 
+namespace {
+
+bool HasAny(const std::vector<std::size_t>& counts)
+{
+    return std::any_of(counts.begin(), counts.end(), [](std::size_t count) { return count > 0; });
+}
+
+// Nothing of a class may be left out, except the time of collection if times do not count.
+bool IsWhole(const TCoverage::TClass& cls, bool timesCount)
+{
+    if (!cls.madeIn.empty()) {
+        // If every instance was made, none that came from an inventory is left out.
+        return !cls.HasOwnInstances();
+    }
+    return cls.state == TCoverage::kCompared && !HasAny(cls.sharing) && !cls.reducedReferences &&
+           std::all_of(cls.leftOut.begin(), cls.leftOut.end(),
+                       [timesCount](const std::string& name) { return !timesCount && name == kCollectionTime; });
+}
+
+}  // namespace
+
+bool TCoverage::TClass::HasOwnInstances() const
+{
+    return std::accumulate(instances.begin(), instances.end(), static_cast<std::size_t>(0)) > madeIn.size();
+}
+
+bool TCoverage::TClass::IsCompared() const
+{
+    return HasAny(compared);
+}
+
 bool TCoverage::IsComplete() const
 {
     return IsComplete(true);
@@ -19,44 +50,26 @@ bool TCoverage::IsCompleteButForTimes() const
 
 bool TCoverage::IsComplete(bool timesCount) const
 {
-    return CountSharing() == 0 && std::all_of(classes.begin(), classes.end(),
-                                              [this, timesCount](const TClass& cls) { return IsWholeClass(cls, timesCount); });
+    return !IsNothingCompared() &&
+           std::all_of(classes.begin(), classes.end(), [timesCount](const TClass& cls) { return IsWhole(cls, timesCount); });
 }
 
-bool TCoverage::IsWholeClass(const TClass& cls, bool timesCount) const
+bool TCoverage::IsNothingCompared() const
 {
-    if (cls.state == kOperatingSystemMade) {
-        // If every instance was made, none that came from an inventory is left out.
-        const auto made = std::count_if(notes.begin(), notes.end(),
-                                        [](const TSchemaNote& note) { return note.kind == TSchemaNote::kOperatingSystemMade; });
-        return static_cast<std::size_t>(made) == cls.instances.size();
-    }
-    // Nothing of a compared class may be left out, except the time of collection if times do not count.
-    return cls.state == kCompared && std::all_of(cls.leftOut.begin(), cls.leftOut.end(), [timesCount](const std::string& name) {
-               return !timesCount && name == kCollectionTime;
-           });
+    return CountComparedClasses() == 0;
 }
 
-std::size_t TCoverage::CountClasses(EState state) const
+std::size_t TCoverage::CountComparedClasses() const
 {
     return static_cast<std::size_t>(
-        std::count_if(classes.begin(), classes.end(), [state](const TClass& cls) { return cls.state == state; }));
+        std::count_if(classes.begin(), classes.end(), [](const TClass& cls) { return cls.IsCompared(); }));
 }
 
 std::size_t TCoverage::CountCompared(std::size_t inventory) const
 {
     std::size_t count = 0;
     for (const TClass& cls : classes) {
-        count += cls.state == kCompared ? cls.instances[inventory] : 0;
-    }
-    return count;
-}
-
-std::size_t TCoverage::CountSharing() const
-{
-    std::size_t count = 0;
-    for (const TClass& cls : classes) {
-        count = std::accumulate(cls.sharing.begin(), cls.sharing.end(), count);
+        count += cls.compared[inventory];
     }
     return count;
 }

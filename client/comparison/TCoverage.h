@@ -12,7 +12,9 @@ namespace NORVZEL20 {
 struct TCoverage {
     enum EState {
         kCompared,
-        kExcludedByRules,      ///< the rules leave no property to compare
+        kExcludedByRules,      ///< the rules reach the class, but leave no property to compare
+        kReachedByNoElement,   ///< no element of the rules is for the class or one above it
+        kNothingToCompare,     ///< the class has no property, or only the time of collection
         kUnknownToReference,   ///< the reference does not declare the class
         kOperatingSystemMade,  ///< the rules exclude KALMO_OperatingSystem because the client made an instance of it
     };
@@ -22,28 +24,39 @@ struct TCoverage {
         std::string name;
         EState state = kCompared;
         std::vector<std::size_t> instances;
-        std::vector<std::string> leftOut;       ///< properties not compared, ascending; empty unless the state is kCompared
-        std::vector<std::string> excludedKeys;  ///< keys that do not identify instances, in the order of the rules
-        std::vector<std::size_t> sharing;       ///< instances that have the key of an earlier one, because keys are excluded
+        std::vector<std::size_t> madeIn;         ///< positions of the inventories whose one instance the client made
+        std::vector<std::size_t> compared;       ///< those of the inventory that the comparison looked for in the others
+        std::vector<std::string> leftOut;        ///< properties not compared, ascending; empty unless the state is kCompared
+        std::vector<std::string> excludedKeys;   ///< in the order of the rules, also those that are no keys of the class
+        std::vector<std::string> ignoredKeys;    ///< those of them that are keys, which hence do not identify instances
+        std::vector<std::size_t> sharing;        ///< instances that have the key of an earlier one, because keys are excluded
+        std::vector<std::size_t> sharingAlone;   ///< those of `sharing` whose key the reference lacks; none of the reference itself
+        std::vector<std::string> referenceKeys;  ///< excluded keys that were left out of references, in the order of the rules
+        bool reducedReferences = false;          ///< whether references were compared without those keys or without a namespace
+
+        /// Whether any instance is one of an inventory, not made by the client.
+        bool HasOwnInstances() const;
+        /// Whether any instance was compared.
+        bool IsCompared() const;
     };
 
     std::vector<TClass> classes;     ///< in ascending order of their names
     std::size_t classesWithout = 0;  ///< classes without an instance in any inventory
     std::vector<TSchemaNote> notes;  ///< what was done to make the inventories comparable, in that order
 
-    /// Whether every instance of every inventory was compared in every property.
+    /// Whether there were instances to compare, and every instance of every inventory was compared in every property, references
+    /// as a whole.
     bool IsComplete() const;
     /// The same, times of collection aside: a class whose default is to include is compared without them.
     bool IsCompleteButForTimes() const;
-    /// How many classes have that state.
-    std::size_t CountClasses(EState state) const;
-    /// How many instances of compared classes one inventory has.
+    /// Whether no instance of any inventory was compared with anything, nor reported as missing elsewhere.
+    bool IsNothingCompared() const;
+    /// How many classes have instances that were compared.
+    std::size_t CountComparedClasses() const;
+    /// How many instances of one inventory were compared.
     std::size_t CountCompared(std::size_t inventory) const;
-    /// How many instances share a key, over all classes and inventories.
-    std::size_t CountSharing() const;
 
   private:
-    bool IsWholeClass(const TClass& cls, bool timesCount) const;
     bool IsComplete(bool timesCount) const;
 };
 

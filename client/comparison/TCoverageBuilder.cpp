@@ -1,18 +1,21 @@
 // Which classes a comparison covers. The plug-in walks the class tree of the reference, so a class that has instances anywhere is
 //
 //   unknown to the reference    if that does not declare it;
-//   excluded                    if the rules leave it no property (kOperatingSystemMade if the client excluded it by itself);
+//   not compared                if there is no property to compare: because the client excluded the class by itself, because no
+//                               element reaches it, because it has none, or because its rules exclude them;
 //   compared                    otherwise.
 //
-// Of a compared class two things may still escape the comparison, and are listed: properties that the rules or the reference's
-// declaration leave out, and, if the rules exclude keys, instances that share their key with an earlier one.
+// Of a compared class some things may still escape the comparison, and are listed: properties that the rules or the reference's
+// declaration leave out, and what is lost if the rules exclude keys (see DescribeExcludedKeys.cpp). An instance of the class
+// counts as compared if the plug-in looks for it in another inventory or in the reference, whether or not it is found there.
 #include "client/comparison/TCoverageBuilder.h"
 
 #include <algorithm>
 #include <numeric>
 
-#include "client/comparison/TInstanceIndex.h"
+#include "client/comparison/DescribeExcludedKeys.h"
 #include "embedded/value/TNameText.h"
+#include "provider/DeltaNames.h"
 
 namespace NORVZEL20 {
 
@@ -44,29 +47,53 @@ void TCoverageBuilder::AddClass(TCoverage& coverage, const std::string& classNam
         ++coverage.classesWithout;
         return;
     }
-    cls.sharing.assign(fInventories.size(), 0);
-    const boost::shared_ptr<TInMemClass> declared = fInventories[0].ns->FindClass(className);
-    if (declared) {
-        Describe(cls, declared);
-    } else {
-        cls.state = TCoverage::kUnknownToReference;
+    const std::vector<std::size_t> none(fInventories.size(), 0);
+    cls.madeIn = FindMade(className);
+    cls.compared = cls.sharing = cls.sharingAlone = none;
+    cls.state = Describe(cls);
+    if (cls.state == TCoverage::kCompared) {
+        CountCompared(cls);
     }
     coverage.classes.push_back(cls);
 }
 
-void TCoverageBuilder::Describe(TCoverage::TClass& cls, const boost::shared_ptr<ICIMClass>& declared)
+TCoverage::EState TCoverageBuilder::Describe(TCoverage::TClass& cls)
 {
+    const boost::shared_ptr<TInMemClass> declared = fInventories[0].ns->FindClass(cls.name);
+    if (!declared) {
+        return TCoverage::kUnknownToReference;
+    }
     const std::vector<std::string> compared = fRules.PropertiesOf(declared);
     if (compared.empty()) {
-        cls.state = IsMade(cls.name) ? TCoverage::kOperatingSystemMade : TCoverage::kExcludedByRules;
-        return;
+        return WhyNothingIsCompared(cls, *declared);
     }
     cls.leftOut = LeftOut(cls.name, compared);
-    cls.excludedKeys = fRules.ExcludedKeysOf(cls.name);
-    if (!cls.excludedKeys.empty()) {
-        for (std::size_t i = 0; i < fInventories.size(); ++i) {
-            cls.sharing[i] = TInstanceIndex(*fInventories[i].ns, cls.name, fRules).CountSharing();
-        }
+    DescribeExcludedKeys(cls, fInventories, fRules, compared);
+    return TCoverage::kCompared;
+}
+
+TCoverage::EState TCoverageBuilder::WhyNothingIsCompared(const TCoverage::TClass& cls, const TInMemClass& declared) const
+{
+    if (!cls.madeIn.empty()) {
+        return TCoverage::kOperatingSystemMade;
+    }
+    if (!fRules.Reach(cls.name)) {
+        return TCoverage::kReachedByNoElement;
+    }
+    const std::vector<std::uint32_t>& slots = declared.GetLayout().GetOrder();
+    const bool hasOthers = std::any_of(slots.begin(), slots.end(), [&declared](std::uint32_t slot) {
+        return declared.GetLayout().GetDecl(slot).GetName() != kCollectionTime;
+    });
+    return hasOthers ? TCoverage::kExcludedByRules : TCoverage::kNothingToCompare;
+}
+
+// Of the reference's instances with the same key only the first is compared. A made one is not the inventory's.
+void TCoverageBuilder::CountCompared(TCoverage::TClass& cls) const
+{
+    cls.compared = cls.instances;
+    cls.compared[0] -= cls.sharing[0];
+    for (const std::size_t inventory : cls.madeIn) {
+        cls.compared[inventory] = 0;
     }
 }
 
@@ -99,11 +126,15 @@ std::vector<std::size_t> TCoverageBuilder::CountInstances(const std::string& cla
     return counts;
 }
 
-bool TCoverageBuilder::IsMade(const std::string& className) const
+std::vector<std::size_t> TCoverageBuilder::FindMade(const std::string& className) const
 {
-    return std::any_of(fNotes.begin(), fNotes.end(), [&className](const TSchemaNote& note) {
-        return note.kind == TSchemaNote::kOperatingSystemMade && TNameText::Equal(note.className, className);
-    });
+    std::vector<std::size_t> inventories;
+    for (const TSchemaNote& note : fNotes) {
+        if (note.kind == TSchemaNote::kOperatingSystemMade && TNameText::Equal(note.className, className)) {
+            inventories.push_back(note.inventory);
+        }
+    }
+    return inventories;
 }
 
 }  // namespace NORVZEL20

@@ -24,10 +24,12 @@ class TCoverageBuilder {
 
   private:
     void AddClass(TCoverage& coverage, const std::string& className);
-    void Describe(TCoverage::TClass& cls, const boost::shared_ptr<ICIMClass>& declared);
+    TCoverage::EState Describe(TCoverage::TClass& cls);
+    TCoverage::EState WhyNothingIsCompared(const TCoverage::TClass& cls, const TInMemClass& declared) const;
+    void CountCompared(TCoverage::TClass& cls) const;
     std::vector<std::string> LeftOut(const std::string& className, const std::vector<std::string>& compared) const;
     std::vector<std::size_t> CountInstances(const std::string& className) const;
-    bool IsMade(const std::string& className) const;
+    std::vector<std::size_t> FindMade(const std::string& className) const;
 
     const std::vector<TInventory>& fInventories;
     TRules& fRules;

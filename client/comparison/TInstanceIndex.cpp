@@ -13,7 +13,6 @@ TInstanceIndex::TInstanceIndex(ICIMNamespace& ns, const std::string& className, 
     }
     for (const boost::shared_ptr<ICIMInstance>& instance : InstancesOf(*cls)) {
         fInstances[rules.KeyOf(className, instance)].push_back(instance);
-        ++fCount;
     }
 }
 

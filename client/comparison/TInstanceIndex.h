@@ -16,6 +16,8 @@ class TInstanceIndex {
   public:
     using TInstances = std::vector<boost::shared_ptr<ICIMInstance>>;
 
+    using TByKey = std::unordered_map<std::string, TInstances>;
+
     /// Empty if the namespace does not declare the class. Errors: TZELException of the namespace. Cost: one key for each instance.
     TInstanceIndex(ICIMNamespace& ns, const std::string& className, TRules& rules);
 
@@ -23,12 +25,11 @@ class TInstanceIndex {
     /// Empty for an unknown key. Valid while the index lives.
     const TInstances& Find(const std::string& key) const;
 
-    /// How many instances have the key of an earlier one.
-    std::size_t CountSharing() const { return fCount - fInstances.size(); }
+    /// All instances, in no particular order of their keys. Valid while the index lives.
+    const TByKey& GetAll() const { return fInstances; }
 
   private:
-    std::unordered_map<std::string, TInstances> fInstances;
-    std::size_t fCount = 0;
+    TByKey fInstances;
 };
 
 }  // namespace NORVZEL20

@@ -13,6 +13,10 @@ const char* StateName(TCoverage::EState state)
         return "compared";
     case TCoverage::kExcludedByRules:
         return "excludedByRules";
+    case TCoverage::kReachedByNoElement:
+        return "reachedByNoElement";
+    case TCoverage::kNothingToCompare:
+        return "nothingToCompare";
     case TCoverage::kUnknownToReference:
         return "unknownToReference";
     default:
@@ -47,7 +51,12 @@ TJson JsonOfCoveredClass(const TCoverage::TClass& cls)
             {"instances", cls.instances},
             {"propertiesLeftOut", cls.leftOut},
             {"excludedKeys", cls.excludedKeys},
-            {"sharingKeys", cls.sharing}};
+            {"sharingKeys", cls.sharing},
+            {"instancesCompared", cls.compared},
+            {"ignoredKeys", cls.ignoredKeys},
+            {"sharingKeysWithoutPartner", cls.sharingAlone},
+            {"referencesReduced", cls.reducedReferences},
+            {"referenceKeysLeftOut", cls.referenceKeys}};
 }
 
 TJson JsonOfNote(const TComparisonReport& report, const TSchemaNote& note)

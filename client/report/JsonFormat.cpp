@@ -3,12 +3,14 @@
 //   { "format": "cimdelta-comparison", "version": 1,
 //     "inventories": [ { "label": "web01", "file": "web01.xml", "role": "reference", "instancesCompared": 2 } ],
 //     "summary": { "differences": 1, "onlyInReference": 0, "onlyInOthers": 0, "changedValues": 1, "changedInstances": 1,
-//                  "everythingCompared": false },
+//                  "everythingCompared": false, "nothingCompared": false },
 //     "differences": [ { "kind": "changed", "class": "Disk", "instance": "Disk.Id=\"sda\"", "keys": { "Id": "sda" },
 //                        "inventories": [ "web02" ], "property": "Size", "reference": { "type": "uint64", "value": 500 },
 //                        "others": [ { "inventories": [ "web02" ], "type": "uint64", "value": 250 } ] } ],
 //     "coverage": { "classes": [ { "class": "Disk", "state": "compared", "instances": [ 1, 1 ], "propertiesLeftOut": [ "Model" ],
-//                                  "excludedKeys": [], "sharingKeys": [ 0, 0 ] } ],
+//                                  "excludedKeys": [], "sharingKeys": [ 0, 0 ], "instancesCompared": [ 1, 1 ],
+//                                  "ignoredKeys": [], "sharingKeysWithoutPartner": [ 0, 0 ], "referencesReduced": false,
+//                                  "referenceKeysLeftOut": [] } ],
 //                   "classesWithoutInstances": 0,
 //                   "schema": [ { "kind": "propertyDeclared", "inventory": "web02", "asIn": "web01", "class": "Disk",
 //                                 "property": "Model" } ] } }
@@ -88,7 +90,8 @@ TJson JsonOfSummary(const TComparisonReport& report)
             {"onlyInOthers", counts.onlyInOthers},
             {"changedValues", counts.changedValues},
             {"changedInstances", counts.changedInstances},
-            {"everythingCompared", report.coverage.IsComplete()}};
+            {"everythingCompared", report.coverage.IsComplete()},
+            {"nothingCompared", report.coverage.IsNothingCompared()}};
 }
 
 TJson JsonOfInventories(const TComparisonReport& report)

@@ -57,7 +57,7 @@ std::string TTextFormat::Summary() const
 std::string TTextFormat::Agreement() const
 {
     const std::string between = " between " + Labels({0}) + " and " + Others();
-    if (fReport.coverage.CountClasses(TCoverage::kCompared) == 0) {
+    if (fReport.coverage.IsNothingCompared()) {
         return "Nothing was compared" + between + ".";
     }
     if (fReport.coverage.IsCompleteButForTimes()) {

@@ -4,7 +4,8 @@
 //   3 classes have no instances in any inventory.
 //   Not compared, because the rules exclude every property: Process (12 / 7).
 //   Properties of Disk not compared: Caption, Model.
-//   Instances of Disk that share their key with another one, since the rules leave out Bus: 2 of web01; ...
+//   Instances of Disk with the key of an earlier one, since the rules leave out Bus: 2 of web01, not compared; ...
+//   References of Mount were compared without key Bus and without their namespace.
 //   Declared in web02 as in web01: class Tape, Disk.Model.
 //   Made in web02: an instance of KALMO_OperatingSystem.
 //
@@ -15,6 +16,7 @@
 #include <map>
 #include <utility>
 
+#include "client/rules/DescribeReducedReferences.h"
 #include "client/text/Counted.h"
 #include "client/text/DisplayText.h"
 #include "client/text/SomeOf.h"
@@ -34,6 +36,7 @@ class TStatement {
         WriteNotCompared();
         WriteLeftOut();
         WriteSharing();
+        WriteReferences();
         WriteNotes();
         return fOut;
     }
@@ -45,7 +48,7 @@ class TStatement {
         for (std::size_t i = 0; i < fReport.labels.size(); ++i) {
             counts.push_back(Counted(fCoverage.CountCompared(i), "instance") + " of " + Label(i));
         }
-        fOut += "Compared: " + Counted(fCoverage.CountClasses(TCoverage::kCompared), "class", "classes") + "; " +
+        fOut += "Compared: " + Counted(fCoverage.CountComparedClasses(), "class", "classes") + "; " +
                 boost::algorithm::join(counts, ", ") + ".\n";
         if (fCoverage.classesWithout > 0) {
             fOut += Counted(fCoverage.classesWithout, "class has", "classes have") + " no instances in any inventory.\n";
@@ -55,6 +58,9 @@ class TStatement {
     void WriteNotCompared()
     {
         WriteClasses(TCoverage::kExcludedByRules, "Not compared, because the rules exclude every property");
+        WriteClasses(TCoverage::kReachedByNoElement,
+                     "Not compared, because no element of the rules is for the class or one above it");
+        WriteClasses(TCoverage::kNothingToCompare, "Not compared, because the class has no property to compare");
         WriteClasses(TCoverage::kUnknownToReference, "Not compared, because " + Label(0) + " does not declare the class");
         WriteClasses(TCoverage::kOperatingSystemMade, "Not compared, because cimdelta made it");
     }
@@ -92,24 +98,38 @@ class TStatement {
         }
     }
 
-    // The plug-in keeps one instance of the reference for each key, so the others that share it are not compared. Each instance
-    // of another inventory is compared, but with that one.
     void WriteSharing()
     {
         for (const TCoverage::TClass& cls : fCoverage.classes) {
-            std::vector<std::string> counts;
+            std::vector<std::string> groups;
             for (std::size_t i = 0; i < cls.sharing.size(); ++i) {
-                if (cls.sharing[i] > 0) {
-                    counts.push_back(std::to_string(cls.sharing[i]) + " of " + Label(i));
-                }
+                AddSharing(groups, i, cls.sharing[i] - cls.sharingAlone[i],
+                           i == 0 ? "not compared" : "compared with the same instance of " + Label(0) + " as the earlier one");
+                AddSharing(groups, i, cls.sharingAlone[i],
+                           "reported with the earlier one, since " + Label(0) + " has none with that key");
             }
-            if (!counts.empty()) {
+            if (!groups.empty()) {
                 fOut += "Instances of " + EscapeForDisplay(cls.name) +
-                        " that share their key with another one, since the rules leave out " +
-                        EscapeForDisplay(boost::algorithm::join(cls.excludedKeys, ", ")) + ": " +
-                        boost::algorithm::join(counts, ", ") +
-                        (cls.sharing[0] > 0 ? "; those of " + Label(0) + " were not compared.\n"
-                                            : "; each was compared with the same one.\n");
+                        " with the key of an earlier one, since the rules leave out " +
+                        EscapeForDisplay(boost::algorithm::join(cls.ignoredKeys, ", ")) + ": " +
+                        boost::algorithm::join(groups, "; ") + ".\n";
+            }
+        }
+    }
+
+    void AddSharing(std::vector<std::string>& groups, std::size_t inventory, std::size_t count, const std::string& fate) const
+    {
+        if (count > 0) {
+            groups.push_back(std::to_string(count) + " of " + Label(inventory) + ", " + fate);
+        }
+    }
+
+    void WriteReferences()
+    {
+        for (const TCoverage::TClass& cls : fCoverage.classes) {
+            if (cls.reducedReferences) {
+                fOut += "References of " + EscapeForDisplay(cls.name) + " were compared " +
+                        EscapeForDisplay(DescribeReducedReferences(cls.referenceKeys)) + ".\n";
             }
         }
     }

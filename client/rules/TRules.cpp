@@ -43,6 +43,16 @@ const std::vector<std::string>& TRules::ExcludedKeysOf(const std::string& classN
     return Find(className)->fExcludedKeys;
 }
 
+bool TRules::ExcludesKey(const std::string& className, const std::string& key)
+{
+    return Find(className)->isKeyExcluded(key);
+}
+
+bool TRules::Reach(const std::string& className) const
+{
+    return fRuleset.fRules.count(className) > 0;
+}
+
 bool TRules::HasExcludedKeys() const
 {
     return std::any_of(fRuleset.fRules.begin(), fRuleset.fRules.end(),

@@ -35,6 +35,12 @@ class TRules {
     /// The class's excluded keys, in the order of the rules.
     const std::vector<std::string>& ExcludedKeysOf(const std::string& className);
 
+    /// Whether the rules of the class leave a key of that name out, of its instances and of the references that they hold.
+    bool ExcludesKey(const std::string& className, const std::string& key);
+
+    /// Whether an element of the file gives the class rules, its own or those of a class above it. Names count byte for byte.
+    bool Reach(const std::string& className) const;
+
     /// Whether any class excludes any key.
     bool HasExcludedKeys() const;
 

@@ -6,43 +6,53 @@ namespace NORVZEL20 {
 namespace {
 
 /// The formats for programs. Their texts are part of the contract, so they are compared letter by letter.
-class FormatsTest : public TClientFixture {};
+class FormatsTest : public TClientFixture {
+  protected:
+    /// What is said of a class under rules that neither leave properties out nor exclude keys.
+    static std::string CoveredClass(const std::string& name, const std::string& state, const std::string& instances,
+                                    const std::string& compared)
+    {
+        return "{\"class\":\"" + name + "\",\"state\":\"" + state + "\",\"instances\":[" + instances +
+               "],\"propertiesLeftOut\":[],\"excludedKeys\":[],\"sharingKeys\":[0,0,0],\"instancesCompared\":[" + compared +
+               "],\"ignoredKeys\":[],\"sharingKeysWithoutPartner\":[0,0,0],\"referencesReduced\":false,"
+               "\"referenceKeysLeftOut\":[]}";
+    }
+};
 
 TEST_F(FormatsTest, NdjsonHasADocumentForEachDifferenceAndOneForTheCoverage)
 {
-    EXPECT_EQ("{\"kind\":\"onlyInReference\",\"class\":\"INV_Disk\",\"instance\":\"INV_Disk.BootId=1,Device=\\\"sda\\\"\",\"keys\":"
-              "{\"Device\":\"sda\",\"BootId\":1},"
-              "\"inventories\":[\"web02\"]}\n"
-              "{\"kind\":\"onlyInOthers\",\"class\":\"INV_Disk\",\"instance\":\"INV_Disk.BootId=7,Device=\\\"sda\\\"\",\"keys\":{"
-              "\"Device\":\"sda\",\"BootId\":7},"
-              "\"inventories\":[\"web02\"]}\n"
-              "{\"kind\":\"changed\",\"class\":\"INV_Service\",\"instance\":\"INV_Service.Id=\\\"ssh\\\"\",\"keys\":{\"Id\":"
-              "\"ssh\"},\"inventories\":[\"web03\"],"
-              "\"property\":\"Caption\",\"reference\":{\"type\":\"string\",\"value\":\"Secure shell\"},"
-              "\"others\":[{\"inventories\":[\"web03\"],\"type\":\"string\",\"value\":\"Secure\\nshell \u009b31m\"}]}\n"
-              "{\"kind\":\"changed\",\"class\":\"INV_Service\",\"instance\":\"INV_Service.Id=\\\"ssh\\\"\",\"keys\":{\"Id\":"
-              "\"ssh\"},\"inventories\":[\"web02\"],"
-              "\"property\":\"Started\",\"reference\":{\"type\":\"boolean\",\"value\":true},"
-              "\"others\":[{\"inventories\":[\"web02\"],\"type\":\"boolean\",\"value\":false}]}\n"
-              "{\"kind\":\"coverage\",\"inventories\":[{\"label\":\"web01\",\"file\":\"web01.xml\",\"role\":\"reference\","
-              "\"instancesCompared\":2},"
-              "{\"label\":\"web02\",\"file\":\"web02.xml\",\"role\":\"other\",\"instancesCompared\":2},"
-              "{\"label\":\"web03\",\"file\":\"web03.xml\",\"role\":\"other\",\"instancesCompared\":2}],"
-              "\"summary\":{\"differences\":4,\"onlyInReference\":1,\"onlyInOthers\":1,\"changedValues\":2,\"changedInstances\":1,"
-              "\"everythingCompared\":false},"
-              "\"classes\":[{\"class\":\"INV_Disk\",\"state\":\"compared\",\"instances\":[1,1,1],\"propertiesLeftOut\":[],"
-              "\"excludedKeys\":[],\"sharingKeys\":[0,0,0]},"
-              "{\"class\":\"INV_Package\",\"state\":\"excludedByRules\",\"instances\":[3,3,4],\"propertiesLeftOut\":[],"
-              "\"excludedKeys\":[],\"sharingKeys\":[0,0,0]},"
-              "{\"class\":\"INV_Service\",\"state\":\"compared\",\"instances\":[1,1,1],\"propertiesLeftOut\":[],\"excludedKeys\":[]"
-              ",\"sharingKeys\":[0,0,0]},"
-              "{\"class\":\"KALMO_OperatingSystem\",\"state\":\"excludedByRules\",\"instances\":[1,1,1],\"propertiesLeftOut\":[],"
-              "\"excludedKeys\":[],"
-              "\"sharingKeys\":[0,0,0]}],\"classesWithoutInstances\":1,\"schema\":[]}\n",
-              Result({"compare", "-o", "ndjson", "--spec",
-                      Scratch("rules", "<DifftoolSpec><class name='INV_Disk' default='include'/><class name='INV_Element' "
-                                       "default='include'/></DifftoolSpec>"),
-                      "web01.xml", "web02.xml", "web03.xml"}));
+    EXPECT_EQ(
+        std::string(
+            "{\"kind\":\"onlyInReference\",\"class\":\"INV_Disk\",\"instance\":\"INV_Disk.BootId=1,Device=\\\"sda\\\"\",\"keys\":"
+            "{\"Device\":\"sda\",\"BootId\":1},"
+            "\"inventories\":[\"web02\"]}\n"
+            "{\"kind\":\"onlyInOthers\",\"class\":\"INV_Disk\",\"instance\":\"INV_Disk.BootId=7,Device=\\\"sda\\\"\",\"keys\":{"
+            "\"Device\":\"sda\",\"BootId\":7},"
+            "\"inventories\":[\"web02\"]}\n"
+            "{\"kind\":\"changed\",\"class\":\"INV_Service\",\"instance\":\"INV_Service.Id=\\\"ssh\\\"\",\"keys\":{\"Id\":"
+            "\"ssh\"},\"inventories\":[\"web03\"],"
+            "\"property\":\"Caption\",\"reference\":{\"type\":\"string\",\"value\":\"Secure shell\"},"
+            "\"others\":[{\"inventories\":[\"web03\"],\"type\":\"string\",\"value\":\"Secure\\nshell \u009b31m\"}]}\n"
+            "{\"kind\":\"changed\",\"class\":\"INV_Service\",\"instance\":\"INV_Service.Id=\\\"ssh\\\"\",\"keys\":{\"Id\":"
+            "\"ssh\"},\"inventories\":[\"web02\"],"
+            "\"property\":\"Started\",\"reference\":{\"type\":\"boolean\",\"value\":true},"
+            "\"others\":[{\"inventories\":[\"web02\"],\"type\":\"boolean\",\"value\":false}]}\n"
+            "{\"kind\":\"coverage\",\"inventories\":[{\"label\":\"web01\",\"file\":\"web01.xml\",\"role\":\"reference\","
+            "\"instancesCompared\":2},"
+            "{\"label\":\"web02\",\"file\":\"web02.xml\",\"role\":\"other\",\"instancesCompared\":2},"
+            "{\"label\":\"web03\",\"file\":\"web03.xml\",\"role\":\"other\",\"instancesCompared\":2}],"
+            "\"summary\":{\"differences\":4,\"onlyInReference\":1,\"onlyInOthers\":1,\"changedValues\":2,\"changedInstances\":1,"
+            "\"everythingCompared\":false,\"nothingCompared\":false},"
+            "\"classes\":[") +
+            CoveredClass("INV_Disk", "compared", "1,1,1", "1,1,1") + "," +
+            CoveredClass("INV_Package", "reachedByNoElement", "3,3,4", "0,0,0") + "," +
+            CoveredClass("INV_Service", "compared", "1,1,1", "1,1,1") + "," +
+            CoveredClass("KALMO_OperatingSystem", "reachedByNoElement", "1,1,1", "0,0,0") +
+            "],\"classesWithoutInstances\":1,\"schema\":[]}\n",
+        Result({"compare", "-o", "ndjson", "--spec",
+                Scratch("rules", "<DifftoolSpec><class name='INV_Disk' default='include'/><class name='INV_Element' "
+                                 "default='include'/></DifftoolSpec>"),
+                "web01.xml", "web02.xml", "web03.xml"}));
 }
 
 TEST_F(FormatsTest, JsonHoldsWhatNdjsonHolds)

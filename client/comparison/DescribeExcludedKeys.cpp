@@ -1,0 +1,151 @@
+// What happens to a class whose rules exclude keys:
+//
+//   instances     Several of one inventory may have the same key. Of those of the reference the first stands for the key, and the
+//                 others are not compared. Each one of another inventory is compared with that first one; if the reference has
+//                 none with the key, one difference stands for them all.
+//   references    The same keys, and the namespace, are left out of each pair of references that is compared. Which class they
+//   refer
+//                 to does not matter, so two references to different instances may count as equal.
+//
+// A pair of references is compared only if the instances that hold them have the same key and neither is null.
+#include "client/comparison/DescribeExcludedKeys.h"
+
+#include <algorithm>
+#include <iterator>
+#include <set>
+
+#include "client/comparison/TInstanceIndex.h"
+#include "client/inventory/CollectObjects.h"
+#include "client/inventory/PropertyValue.h"
+#include "host/TCIMReference.h"
+
+namespace NORVZEL20 {
+
+namespace {
+
+// Gathers over the inventories what becomes part of the coverage of one class.
+class TExcludedKeys {
+  public:
+    TExcludedKeys(TCoverage::TClass& cls, TRules& rules) : fClass(cls), fRules(rules) {}
+
+    void Describe(const std::vector<TInventory>& inventories, const std::vector<std::string>& compared)
+    {
+        FindIgnoredKeys(inventories);
+        const TInstanceIndex reference(*inventories[0].ns, fClass.name, fRules);
+        CountSharing(reference, 0, reference);
+        for (std::size_t i = 1; i < inventories.size(); ++i) {
+            const TInstanceIndex other(*inventories[i].ns, fClass.name, fRules);
+            CountSharing(other, i, reference);
+            FindReferences({inventories[0].ns, inventories[i].ns}, compared);
+            MatchReferences(other, reference);
+        }
+        Keep(fKeysInReferences, fClass.referenceKeys);
+    }
+
+  private:
+    void FindIgnoredKeys(const std::vector<TInventory>& inventories)
+    {
+        std::set<std::string> keys;
+        for (const TInventory& inventory : inventories) {
+            if (const boost::shared_ptr<TInMemClass> cls = inventory.ns->FindClass(fClass.name)) {
+                const std::vector<std::string> names = KeyNamesOf(*cls);
+                std::copy_if(names.begin(), names.end(), std::inserter(keys, keys.end()),
+                             [this](const std::string& name) { return fRules.ExcludesKey(fClass.name, name); });
+            }
+        }
+        Keep(keys, fClass.ignoredKeys);
+    }
+
+    // With --strict-schema an inventory may lack a property, or declare it with another type; the run then fails.
+    void FindReferences(const std::vector<boost::shared_ptr<TInMemNamespace>>& pair, const std::vector<std::string>& compared)
+    {
+        fReferences = compared;
+        for (const boost::shared_ptr<TInMemNamespace>& ns : pair) {
+            const boost::shared_ptr<TInMemClass> cls = ns->FindClass(fClass.name);
+            fReferences.erase(std::remove_if(fReferences.begin(), fReferences.end(),
+                                             [&cls](const std::string& name) { return !cls || !IsReference(*cls, name); }),
+                              fReferences.end());
+        }
+    }
+
+    static bool IsReference(const TInMemClass& cls, const std::string& property)
+    {
+        const boost::shared_ptr<TInMemPropertyDecl> decl = cls.FindPropertyDecl(property);
+        return decl && decl->GetType() == TCIMValue::TCIMType::kReference;
+    }
+
+    void CountSharing(const TInstanceIndex& index, std::size_t inventory, const TInstanceIndex& reference)
+    {
+        for (const auto& [key, instances] : index.GetAll()) {
+            const std::size_t sharing = instances.size() - 1;
+            fClass.sharing[inventory] += sharing;
+            fClass.sharingAlone[inventory] += reference.Find(key).empty() ? sharing : 0;
+        }
+    }
+
+    void MatchReferences(const TInstanceIndex& other, const TInstanceIndex& reference)
+    {
+        if (fReferences.empty()) {
+            return;
+        }
+        for (const auto& [key, instances] : other.GetAll()) {
+            const TInstanceIndex::TInstances& masters = reference.Find(key);
+            for (std::size_t i = 0; i < instances.size() && !masters.empty(); ++i) {
+                MatchReferences(*instances[i], *masters.front());
+            }
+        }
+    }
+
+    void MatchReferences(const ICIMInstance& other, const ICIMInstance& master)
+    {
+        for (const std::string& property : fReferences) {
+            const TCIMValue ofOther = ValueOf(other, property);
+            const TCIMValue ofMaster = ValueOf(master, property);
+            if (!ofOther.IsNull() && !ofMaster.IsNull()) {
+                NoteLeftOut(ofOther);
+                NoteLeftOut(ofMaster);
+            }
+        }
+    }
+
+    void NoteLeftOut(const TCIMReference& path)
+    {
+        const bool hasPlace = !path.GetNamespaceName().empty() || !path.GetHost().empty();
+        fClass.reducedReferences = fClass.reducedReferences || hasPlace;
+        path.EnumerateKeyBindings([this](const std::pair<std::string, TCIMValue>& binding) {
+            if (fRules.ExcludesKey(fClass.name, binding.first)) {
+                fClass.reducedReferences = true;
+                fKeysInReferences.insert(binding.first);
+            }
+            return true;
+        });
+    }
+
+    // The excluded keys that are among `names`, each once, in the order of the rules.
+    void Keep(const std::set<std::string>& names, std::vector<std::string>& kept) const
+    {
+        for (const std::string& key : fClass.excludedKeys) {
+            if (names.count(key) > 0 && std::find(kept.begin(), kept.end(), key) == kept.end()) {
+                kept.push_back(key);
+            }
+        }
+    }
+
+    TCoverage::TClass& fClass;
+    TRules& fRules;
+    std::vector<std::string> fReferences;     // the reference properties compared between two inventories
+    std::set<std::string> fKeysInReferences;  // the excluded keys met in references
+};
+
+}  // namespace
+
+void DescribeExcludedKeys(TCoverage::TClass& cls, const std::vector<TInventory>& inventories, TRules& rules,
+                          const std::vector<std::string>& compared)
+{
+    cls.excludedKeys = rules.ExcludedKeysOf(cls.name);
+    if (!cls.excludedKeys.empty()) {
+        TExcludedKeys(cls, rules).Describe(inventories, compared);
+    }
+}
+
+}  // namespace NORVZEL20
