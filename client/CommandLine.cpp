@@ -162,6 +162,7 @@ class TCommandLine {
         AddFormat(command, fCompare.format);
         AddOutput(command, fCompare.output);
         AddStrictSchema(command, fCompare.strictSchema);
+        command->add_flag("--allow-empty", fCompare.allowEmpty, "do not take it for an error if nothing was compared");
     }
 
     void AddCheck()

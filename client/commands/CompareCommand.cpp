@@ -3,7 +3,9 @@
 #include "client/comparison/TComparison.h"
 #include "client/inventory/TInventoryLoader.h"
 #include "client/process/ExitStatus.h"
+#include "client/process/TClientError.h"
 #include "client/report/CimXmlFormat.h"
+#include "client/report/DescribeNothingCompared.h"
 #include "client/report/JsonFormat.h"
 #include "client/report/ResultOutput.h"
 #include "client/report/TTextFormat.h"
@@ -38,6 +40,9 @@ int RunCompare(const TCompareOptions& options, IConsole& console)
     const std::optional<TRulesText> rules = ReadRulesFor(paths, options.rules);
     std::vector<TInventory> inventories = TInventoryLoader(console).Load(paths);
     const TComparisonReport report = TComparison(inventories, console).Run(rules, options.strictSchema);
+    if (!options.allowEmpty && report.coverage.IsNothingCompared()) {
+        throw TClientError(DescribeNothingCompared(report, options.rules));
+    }
     DeliverResult(console, options.output, Write(report, options.format, console.IsColored() && IsStandardOutput(options.output)));
     return report.differences.empty() ? kExitSuccess : kExitDifferences;
 }

@@ -16,10 +16,11 @@ struct TCompareOptions {
     EOutputFormat format = EOutputFormat::kText;
     std::string output;  ///< empty: standard output
     bool strictSchema = false;
+    bool allowEmpty = false;  ///< whether it is no error if nothing was compared
 };
 
-/// Compares inventories. Returns kExitSuccess (0) for no differences, otherwise kExitDifferences (1). Errors: TClientError; no
-/// result has been written then.
+/// Compares inventories. Returns kExitSuccess (0) for no differences, otherwise kExitDifferences (1). Errors: TClientError, also if
+/// nothing was compared, unless that is allowed; no result has been written then.
 int RunCompare(const TCompareOptions& options, IConsole& console);
 
 }  // namespace NORVZEL20

@@ -28,7 +28,7 @@ class RulesVerdictTest : public TClientFixture {
     {
         const std::string check = Verdict({"check", rules, "--schema", fInventory});
         EXPECT_EQ(check, Verdict({"explain", "Disk.Size", "--spec", rules, "--schema", fInventory}));
-        EXPECT_EQ(check, Verdict({"compare", "--spec", rules, fInventory, fInventory}));
+        EXPECT_EQ(check, Verdict({"compare", "--allow-empty", "--spec", rules, fInventory, fInventory}));
         return check;
     }
 

@@ -1,0 +1,70 @@
+#include "client/report/DescribeNothingCompared.h"
+
+#include <algorithm>
+#include <boost/algorithm/string/join.hpp>
+#include <vector>
+
+#include "client/text/DisplayText.h"
+#include "client/text/SomeOf.h"
+
+namespace NORVZEL20 {
+
+namespace {
+
+// The classes with instances of the inventories that are in that state, as one text; empty if there are none.
+std::string ClassesIn(TCoverage::EState state, const TCoverage& coverage)
+{
+    std::vector<std::string> names;
+    for (const TCoverage::TClass& cls : coverage.classes) {
+        if (cls.state == state && cls.HasOwnInstances()) {
+            names.push_back(cls.name);
+        }
+    }
+    return SomeOf(names);
+}
+
+std::vector<std::string> Reasons(const TComparisonReport& report)
+{
+    const struct {
+        TCoverage::EState state;
+        std::string before;
+        std::string after;
+    } rows[] = {
+        {TCoverage::kReachedByNoElement, "no element of the rules is for ", " or a class above (letter case counts)"},
+        {TCoverage::kExcludedByRules, "the rules exclude every property of ",
+         " (the default is to exclude; default=\"include\" includes)"},
+        {TCoverage::kNothingToCompare, "there is no property to compare in ", ""},
+        {TCoverage::kUnknownToReference, report.paths[0] + " does not declare ", ""},
+        {TCoverage::kOperatingSystemMade, "", " is not compared, since cimdelta made an instance of it"},
+    };
+    std::vector<std::string> reasons;
+    for (const auto& row : rows) {
+        const std::string classes = ClassesIn(row.state, report.coverage);
+        if (!classes.empty()) {
+            reasons.push_back(row.before + classes + row.after);
+        }
+    }
+    return reasons;
+}
+
+// What shows the reason in full, or removes it.
+std::string Advice(const TComparisonReport& report, const std::string& rulesFile)
+{
+    return rulesFile.empty() ? "name inventories with instances"
+                             : "cimdelta check " + rulesFile + " --schema " + report.paths[0] + " shows what the rules compare";
+}
+
+}  // namespace
+
+std::string DescribeNothingCompared(const TComparisonReport& report, const std::string& rulesFile)
+{
+    std::vector<std::string> reasons = Reasons(report);
+    const bool hasInstances = !reasons.empty();
+    if (!hasInstances) {
+        reasons.push_back("no inventory has an instance");
+    }
+    return EscapeForDisplay("nothing was compared: " + boost::algorithm::join(reasons, "; ") + "; " +
+                            Advice(report, hasInstances ? rulesFile : std::string()) + ", or accept this with --allow-empty");
+}
+
+}  // namespace NORVZEL20

@@ -1,0 +1,13 @@
+#pragma once
+
+#include <string>
+
+#include "client/comparison/TComparisonReport.h"
+
+namespace NORVZEL20 {
+
+/// Why a comparison compared nothing, class by class, and what can be done: one message for a person. `rulesFile` is the rules
+/// file as the person named it, or empty. Call this only if report.coverage.IsNothingCompared().
+std::string DescribeNothingCompared(const TComparisonReport& report, const std::string& rulesFile);
+
+}  // namespace NORVZEL20
