@@ -86,6 +86,8 @@ boost::shared_ptr<TInMemPropertyDecl> TSchemaCopier::CopyPropertyDecl(const TInM
     const auto from = owner ? owner->GetInMemNamespace() : nullptr;
     CopyQualifierDecls(source.GetQualifiers(), from.get());
     auto copy = TDeclCopy::CopyProperty(source);
+    // The default of a static property is its value, and the target has none.
+    copy->GetStaticProperty().SetValue(TCIMValue());
     cls.AddPropertyDecl(copy);
     return copy;
 }

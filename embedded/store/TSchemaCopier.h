@@ -26,7 +26,7 @@ class CIMDELTA_INTERNAL_EXPORT TSchemaCopier {
     std::vector<boost::shared_ptr<TInMemClass>> CopyClass(const TInMemClass& source);
 
     /// Declares a property of another namespace's class in `cls`, a class of the target, with its qualifiers. Returns null if
-    /// it has the property, own or inherited. Its instances get a null.
+    /// it has the property, own or inherited. Its instances get a null, of a static property too.
     /// Errors: kTypeMismatch (13) if a class below has the property with another type, TSchemaLimitError if the class, or one
     /// below, would have too many.
     boost::shared_ptr<TInMemPropertyDecl> CopyPropertyDecl(const TInMemPropertyDecl& source, TInMemClass& cls);

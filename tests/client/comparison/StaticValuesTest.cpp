@@ -55,6 +55,22 @@ TEST_F(StaticValuesTest, APropertyMayBeStaticInOneInventoryAlone)
     EXPECT_NE(std::string::npos, Compare(ordinary, Disks("old")).find("    Firmware: y -> old\n"));
 }
 
+/// The value of the one that declares it may stand in the declaration itself.
+TEST_F(StaticValuesTest, APropertyThatOneInventoryDoesNotDeclareIsNullThere)
+{
+    const std::string key = KeyProperty("Id");
+    const std::string with = Document(
+        System() +
+        Class("Disk", "",
+              key + "<PROPERTY NAME=\"Firmware\" TYPE=\"string\">" + Qualifier("Static") + "<VALUE>old</VALUE></PROPERTY>") +
+        Instance("Disk", Value("Id", "0")));
+    const std::string without = Document(System() + Class("Disk", "", key) + Instance("Disk", Value("Id", "0")));
+    const std::string begin = "1 difference between a and b: 1 changed value in 1 instance\n\nDisk\n~ Id=\"0\"\n    Firmware: ";
+    const std::string end = "\nCompared: 2 classes; 2 instances of a, 2 instances of b.\nDeclared in ";
+    EXPECT_EQ(begin + "old -> NULL\n" + end + "b as in a: Disk.Firmware.\n", Compare(with, without));
+    EXPECT_EQ(begin + "NULL -> old\n" + end + "a as in b: Disk.Firmware.\n", Compare(without, with));
+}
+
 TEST_F(StaticValuesTest, SoDoesEveryInstanceOfThree)
 {
     const std::string old = Scratch("a.xml", Disks("old"));

@@ -100,6 +100,20 @@ TEST_F(InMemSchemaCopierTest, APropertyComesWithItsQualifiersAndInstancesGetANul
     EXPECT_EQ(nullptr, fCopier.CopyPropertyDecl(*fDisk->FindPropertyDecl("Size"), *cls));
 }
 
+/// Its default is the value of the other inventory.
+TEST_F(InMemSchemaCopierTest, AStaticPropertyThatIsDeclaredLateIsNull)
+{
+    const auto firmware = boost::make_shared<TInMemPropertyDecl>("Firmware", TCIMValue("old"));
+    firmware->AddQualifier(Qualifier("Static"));
+    fDisk->AddPropertyDecl(firmware);
+    const auto there = fTarget->AllocateInMemClass("Disk", nullptr);
+    there->AddToNamespace(kNoContext);
+    fCopier.CopyPropertyDecl(*firmware, *there);
+    EXPECT_EQ(TCIMValue("old"), firmware->GetStaticProperty().GetValue());
+    EXPECT_EQ(TCIMValue("old"), there->FindPropertyDecl("Firmware")->GetDefaultValue());
+    EXPECT_TRUE(there->FindPropertyDecl("Firmware")->GetStaticProperty().GetValue().IsNull());
+}
+
 TEST_F(InMemSchemaCopierTest, NamesAreRespelledAndReferencesStayFound)
 {
     fCopier.CopyClass(*fDisk);
