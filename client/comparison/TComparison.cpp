@@ -67,7 +67,9 @@ void KeepForever(const boost::shared_ptr<TDeltaNamespace>& records)
 TComparisonReport TComparison::Run(const std::optional<TRulesText>& rules, bool strictSchema)
 {
     fStrictSchema = strictSchema;
-    if (!strictSchema) {
+    if (strictSchema) {
+        fNotes = InspectInventories(fInventories);
+    } else {
         fNotes = CompleteInventories(fInventories, fConsole);
     }
     const TRulesText text =
@@ -135,9 +137,11 @@ bool TComparison::MustKeepReference() const
     if (fInventories.size() != 2) {
         return false;
     }
-    return StaticValuesDiffer(fInventories) || std::any_of(fNotes.begin(), fNotes.end(), [](const TSchemaNote& note) {
+    // With --strict-schema, the run is to report what does not fit.
+    return StaticValuesDiffer(fInventories) ||
+           (!fStrictSchema && std::any_of(fNotes.begin(), fNotes.end(), [](const TSchemaNote& note) {
                return note.kind == TSchemaNote::kTypeDiffers || note.kind == TSchemaNote::kKeysDiffer;
-           });
+           }));
 }
 
 }  // namespace NORVZEL20

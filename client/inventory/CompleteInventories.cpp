@@ -1,10 +1,27 @@
 #include "client/inventory/CompleteInventories.h"
 
+#include <algorithm>
+#include <tuple>
+
 #include "client/inventory/MakeMissingOperatingSystems.h"
+#include "client/inventory/SchemaDifferences.h"
 #include "client/inventory/TSchemaCompletion.h"
 #include "provider/DeltaNames.h"
 
 namespace NORVZEL20 {
+
+namespace {
+
+// Notes arise in the order of declaration, which depends on the tool that wrote the file.
+void SortNotes(std::vector<TSchemaNote>& notes)
+{
+    const auto key = [](const TSchemaNote& note) {
+        return std::tie(note.source, note.className, note.inventory, note.kind, note.property);
+    };
+    std::sort(notes.begin(), notes.end(), [&](const TSchemaNote& a, const TSchemaNote& b) { return key(a) < key(b); });
+}
+
+}  // namespace
 
 std::vector<TSchemaNote> CompleteInventories(std::vector<TInventory>& inventories, IConsole& console)
 {
@@ -13,8 +30,18 @@ std::vector<TSchemaNote> CompleteInventories(std::vector<TInventory>& inventorie
         console.Say("cimdelta: " + inventories[note.inventory].path + ": has no instance of " + kOperatingSystemClass +
                     ", which a comparison needs; one was made");
     }
+    std::vector<TSchemaNote> schema = FindSchemaDifferences(inventories, false);
     const std::vector<TSchemaNote> completed = TSchemaCompletion(inventories).Run();
-    notes.insert(notes.end(), completed.begin(), completed.end());
+    schema.insert(schema.end(), completed.begin(), completed.end());
+    SortNotes(schema);
+    notes.insert(notes.end(), schema.begin(), schema.end());
+    return notes;
+}
+
+std::vector<TSchemaNote> InspectInventories(const std::vector<TInventory>& inventories)
+{
+    std::vector<TSchemaNote> notes = FindSchemaDifferences(inventories, true);
+    SortNotes(notes);
     return notes;
 }
 

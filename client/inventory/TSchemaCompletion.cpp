@@ -5,16 +5,14 @@
 //   the target lacks the class              it is declared there, with the superclasses that are missing too
 //   the target lacks a property             it is declared there
 //   the target spells a name otherwise      it gets the source's spelling, if the source comes first
-//   a type or the keys differ               that is noted, once for each pair of inventories
+//
 // What an early source declares in a later one is there when that one is the source; so one pass over all makes the union.
 //
-// Stored references name classes and keys. Those of changed inventories are rewritten at the end. Notes are sorted, because
-// they arise in the order of declaration, which depends on the tool that wrote the file.
+// One name is decided beforehand: the plug-in knows the time of collection, which it leaves out, in one spelling only. Stored
+// references name classes and keys. Those of changed inventories are rewritten at the end.
 #include "client/inventory/TSchemaCompletion.h"
 
-#include <algorithm>
 #include <set>
-#include <tuple>
 
 #include "client/process/TClientError.h"
 #include "embedded/store/TReferenceAdapter.h"
@@ -23,20 +21,11 @@
 #include "embedded/value/TNameText.h"
 #include "embedded/value/TValueText.h"
 #include "host/TZELException.h"
+#include "provider/DeltaNames.h"
 
 namespace NORVZEL20 {
 
 namespace {
-
-std::vector<std::string> KeysInLowerCase(const TInMemClass& cls)
-{
-    std::vector<std::string> keys;
-    for (const std::uint32_t slot : cls.GetLayout().GetKeys()) {
-        keys.push_back(TNameText::ToLower(cls.GetLayout().GetDecl(slot).GetName()));
-    }
-    std::sort(keys.begin(), keys.end());
-    return keys;
-}
 
 // Why a property cannot be declared in `cls`: which class below declares it with another type.
 std::string DescribeConflict(const TInMemClass& cls, const TInMemPropertyDecl& property)
@@ -56,6 +45,7 @@ std::string DescribeConflict(const TInMemClass& cls, const TInMemPropertyDecl& p
 std::vector<TSchemaNote> TSchemaCompletion::Run()
 {
     fNotes.clear();
+    SpellCollectionTimes();
     for (std::size_t source = 0; source < fInventories.size(); ++source) {
         // A copy of the list: if one namespace is passed twice, declaring in the target changes the source's list as well.
         const std::vector<boost::shared_ptr<TInMemClass>> classes = fInventories[source].ns->GetClasses();
@@ -68,8 +58,22 @@ std::vector<TSchemaNote> TSchemaCompletion::Run()
         }
     }
     AdaptReferences();
-    SortNotes();
     return fNotes;
+}
+
+void TSchemaCompletion::SpellCollectionTimes()
+{
+    for (std::size_t inventory = 0; inventory < fInventories.size(); ++inventory) {
+        TSchemaCopier copier(fInventories[inventory].ns);
+        for (const boost::shared_ptr<TInMemClass>& cls : fInventories[inventory].ns->GetClasses()) {
+            for (const boost::shared_ptr<TInMemPropertyDecl>& own : cls->GetLayout().GetOwnDecls()) {
+                const std::string before = own->GetName();
+                if (TNameText::Equal(before, kCollectionTime) && copier.RespellProperty(*cls, kCollectionTime)) {
+                    Note(TSchemaNote::kPropertyRespelled, inventory, inventory, cls->GetName(), kCollectionTime, before);
+                }
+            }
+        }
+    }
 }
 
 void TSchemaCompletion::SpreadWithinLimits(std::size_t source, const TInMemClass& cls, std::size_t target)
@@ -88,20 +92,14 @@ void TSchemaCompletion::Spread(std::size_t source, const TInMemClass& cls, std::
         Declare(source, cls, target);
         return;
     }
-    // The first inventory decides the spelling; and what differs is noted once, not a second time in the other direction.
+    // The first inventory decides the spelling.
     if (target > source) {
         Respell(source, cls, target);
-        if (KeysInLowerCase(cls) != KeysInLowerCase(*there)) {
-            Note(TSchemaNote::kKeysDiffer, target, source, cls.GetName(), std::string());
-        }
     }
     for (const std::uint32_t slot : cls.GetLayout().GetOrder()) {
         const TInMemPropertyDecl& property = cls.GetLayout().GetDecl(slot);
-        const boost::shared_ptr<TInMemPropertyDecl> counterpart = there->FindPropertyDecl(property.GetName());
-        if (!counterpart) {
+        if (!there->FindPropertyDecl(property.GetName())) {
             DeclareProperty(source, property, target, *there);
-        } else if (target > source && counterpart->GetType() != property.GetType()) {
-            Note(TSchemaNote::kTypeDiffers, target, source, cls.GetName(), property.GetName());
         }
     }
 }
@@ -169,9 +167,7 @@ void TSchemaCompletion::AdaptReferences()
 {
     std::set<std::size_t> changed;
     for (const TSchemaNote& note : fNotes) {
-        if (note.kind != TSchemaNote::kTypeDiffers && note.kind != TSchemaNote::kKeysDiffer) {
-            changed.insert(note.inventory);
-        }
+        changed.insert(note.inventory);
     }
     for (const std::size_t inventory : changed) {
         const std::string twice = TReferenceAdapter::AdaptAndFindDuplicate(*fInventories[inventory].ns);
@@ -180,14 +176,6 @@ void TSchemaCompletion::AdaptReferences()
                                " once names are spelled and keys are declared as in the other inventories; remove one of them");
         }
     }
-}
-
-void TSchemaCompletion::SortNotes()
-{
-    const auto key = [](const TSchemaNote& note) {
-        return std::tie(note.source, note.className, note.inventory, note.kind, note.property);
-    };
-    std::sort(fNotes.begin(), fNotes.end(), [&](const TSchemaNote& a, const TSchemaNote& b) { return key(a) < key(b); });
 }
 
 }  // namespace NORVZEL20

@@ -12,20 +12,20 @@ namespace NORVZEL20 {
 ///
 /// A class or property that an inventory lacks is declared there. A name that differs in letter case gets the spelling of the first
 /// inventory that has it, in stored references too. Instances are neither made nor removed; a property that is declared late is
-/// null in all of them. Keys and types that differ cannot be reconciled and are only noted.
+/// null in all of them. Keys and types that differ are left alone.
 class TSchemaCompletion {
   public:
     /// `inventories` must outlive this.
     explicit TSchemaCompletion(std::vector<TInventory>& inventories) : fInventories(inventories) {}
 
-    /// Returns what was done and found, ordered by the inventory whose declarations were taken, then by class; the order of classes
-    /// in the files has no influence.
+    /// Returns what was done, in any order.
     /// Errors: TClientError if a class or property cannot be declared because a class above or below it has the property with
     /// another type, if the schema would exceed TSchemaLimits, or if two instances have the same path once their references are
     /// spelled alike. The inventories may be changed by then.
     std::vector<TSchemaNote> Run();
 
   private:
+    void SpellCollectionTimes();
     void SpreadWithinLimits(std::size_t source, const TInMemClass& cls, std::size_t target);
     void Spread(std::size_t source, const TInMemClass& cls, std::size_t target);
     void Declare(std::size_t source, const TInMemClass& cls, std::size_t target);
@@ -35,7 +35,6 @@ class TSchemaCompletion {
     void Note(TSchemaNote::EKind kind, std::size_t target, std::size_t source, const std::string& className,
               const std::string& property, const std::string& before = std::string());
     void AdaptReferences();
-    void SortNotes();
 
     std::vector<TInventory>& fInventories;
     std::vector<TSchemaNote> fNotes;

@@ -39,6 +39,12 @@ const char* NoteName(TSchemaNote::EKind kind)
         return "operatingSystemMade";
     case TSchemaNote::kTypeDiffers:
         return "typeDiffers";
+    case TSchemaNote::kArrayTypeDiffers:
+        return "arrayTypeDiffers";
+    case TSchemaNote::kSuperClassDiffers:
+        return "superClassDiffers";
+    case TSchemaNote::kSpellingDiffers:
+        return "spellingDiffers";
     default:
         return "keysDiffer";
     }
@@ -70,6 +76,10 @@ TJson JsonOfNote(const TComparisonReport& report, const TSchemaNote& note)
     }
     if (!note.before.empty()) {
         json["before"] = note.before;
+    }
+    if (note.kind == TSchemaNote::kArrayTypeDiffers || note.kind == TSchemaNote::kSuperClassDiffers) {
+        json["declared"] = note.declared;
+        json["declaredAsIn"] = note.declaredInSource;
     }
     return json;
 }

@@ -169,8 +169,9 @@ class TStatement {
         switch (note.kind) {
         case TSchemaNote::kClassRespelled:
         case TSchemaNote::kPropertyRespelled:
-            return "Spelled in " + Label(note.inventory) + " as in " + Label(note.source) + ": " + element + " (was " +
-                   EscapeForDisplay(note.before) + ")";
+            return "Spelled in " + Label(note.inventory) +
+                   (note.source == note.inventory ? " as comparisons require" : " as in " + Label(note.source)) + ": " + element +
+                   " (was " + EscapeForDisplay(note.before) + ")";
         case TSchemaNote::kOperatingSystemMade:
             return "Made in " + Label(note.inventory) + ": an instance of " + element;
         case TSchemaNote::kTypeDiffers:
@@ -179,9 +180,25 @@ class TStatement {
         case TSchemaNote::kKeysDiffer:
             return "Identified by other keys in " + Label(note.inventory) + " than in " + Label(note.source) + ": " + element +
                    "; instances match only under rules that exclude the keys that one of them lacks";
+        case TSchemaNote::kArrayTypeDiffers: {
+            const bool isBagHere = note.declared == "Bag";
+            return "The order of the array " + element + " counts in " + Label(isBagHere ? note.source : note.inventory) +
+                   " and not in " + Label(isBagHere ? note.inventory : note.source) + "; compared as in " + Label(note.source);
+        }
+        case TSchemaNote::kSuperClassDiffers:
+            return element + " is " + Place(note.declaredInSource) + " in " + Label(note.source) + " and " + Place(note.declared) +
+                   " in " + Label(note.inventory) + "; rules are inherited as in " + Label(note.source);
+        case TSchemaNote::kSpellingDiffers:
+            return element + " is spelled " + EscapeForDisplay(note.before) + " in " + Label(note.inventory) +
+                   ", so instances do not match";
         default:
             return std::string();
         }
+    }
+
+    static std::string Place(const std::string& superClass)
+    {
+        return superClass.empty() ? "a top-level class" : "below " + EscapeForDisplay(superClass);
     }
 
     std::string Label(std::size_t inventory) const { return DisplayLabel(fReport.labels[inventory]); }

@@ -11,7 +11,7 @@
 namespace NORVZEL20 {
 
 /// An instance or a class that is the value of a property (DSP0004, 5.6.3.15 "EmbeddedObject"). It belongs to no namespace and is
-/// not checked against a schema: it holds what was read.
+/// not checked against a schema: it holds what was read. So its arrays are compared in order: nothing says that they are bags.
 ///
 /// One owner builds it, then it is held as boost::shared_ptr<const TEmbeddedObject> and never changes.
 /// Threads: the owner until it is built; afterwards any thread may read it.

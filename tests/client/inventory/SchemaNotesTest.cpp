@@ -1,0 +1,172 @@
+#include "client/inventory/MakeMissingOperatingSystems.h"
+#include "client/inventory/PropertyValue.h"
+#include "client/inventory/TInventoryLoader.h"
+#include "tests/client/TFakeConsole.h"
+#include "tests/client/TPairFixture.h"
+
+namespace NORVZEL20 {
+namespace {
+
+/// What is said about schemas that differ, beside what is done about it.
+class SchemaNotesTest : public TPairFixture {
+  protected:
+    static std::string Names(const std::string& arrayType, const std::vector<std::string>& names)
+    {
+        std::string values;
+        for (const std::string& name : names) {
+            values += "<VALUE>" + name + "</VALUE>";
+        }
+        const std::string qualifier =
+            arrayType.empty() ? arrayType
+                              : "<QUALIFIER NAME=\"ArrayType\" TYPE=\"string\"><VALUE>" + arrayType + "</VALUE></QUALIFIER>";
+        return Document(
+            System() +
+            Class("Disk", "",
+                  KeyProperty("Id") + "<PROPERTY.ARRAY NAME=\"Names\" TYPE=\"string\">" + qualifier + "</PROPERTY.ARRAY>") +
+            Instance("Disk", Value("Id", "1") + "<PROPERTY.ARRAY NAME=\"Names\" TYPE=\"string\"><VALUE.ARRAY>" + values +
+                                 "</VALUE.ARRAY></PROPERTY.ARRAY>"));
+    }
+};
+
+TEST_F(SchemaNotesTest, TheReferenceDecidesWhetherTheOrderOfAnArrayCounts)
+{
+    const std::string bag = Names("", {"x", "y"});
+    const std::string ordered = Names("Ordered", {"y", "x"});
+    EXPECT_EQ("No differences between a and b.\n"
+              "\n"
+              "Compared: 2 classes; 2 instances of a, 2 instances of b.\n"
+              "The order of the array Disk.Names counts in b and not in a; compared as in a.\n",
+              Compare(bag, ordered));
+    EXPECT_EQ("1 difference between a and b: 1 changed value in 1 instance\n"
+              "\n"
+              "Disk\n"
+              "~ Id=\"1\"\n"
+              "    Names: {\"y\", \"x\"} -> {\"x\", \"y\"}\n"
+              "\n"
+              "Compared: 2 classes; 2 instances of a, 2 instances of b.\n"
+              "The order of the array Disk.Names counts in a and not in b; compared as in a.\n",
+              Compare(ordered, bag));
+    EXPECT_NE(std::string::npos,
+              Compare(bag, ordered, {"-o", "ndjson"})
+                  .find("{\"kind\":\"arrayTypeDiffers\",\"inventory\":\"b\",\"asIn\":\"a\",\"class\":\"Disk\",\"property\":"
+                        "\"Names\",\"declared\":\"Ordered\",\"declaredAsIn\":\"Bag\"}"));
+    EXPECT_EQ(std::string::npos, Compare(ordered, Names("Indexed", {"y", "x"})).find("Disk.Names"));
+}
+
+TEST_F(SchemaNotesTest, ArraysInAnEmbeddedObjectAreComparedInOrder)
+{
+    const auto document = [](const std::string& values) {
+        return Document(System() + Class("Disk", "", KeyProperty("Id") + Declaration("In", "string")) +
+                        Instance("Disk", Value("Id", "1") +
+                                             "<PROPERTY NAME=\"In\" TYPE=\"string\" EmbeddedObject=\"object\"><VALUE>"
+                                             "<![CDATA[<INSTANCE CLASSNAME=\"X\"><PROPERTY.ARRAY NAME=\"A\" "
+                                             "TYPE=\"string\"><VALUE.ARRAY>" +
+                                             values + "</VALUE.ARRAY></PROPERTY.ARRAY></INSTANCE>]]></VALUE></PROPERTY>"));
+    };
+    const std::string forth = document("<VALUE>x</VALUE><VALUE>y</VALUE>");
+    Compare(forth, forth);
+    EXPECT_EQ(0, fStatus) << fOut;
+    Compare(forth, document("<VALUE>y</VALUE><VALUE>x</VALUE>"));
+    EXPECT_EQ(1, fStatus) << fOut;
+}
+
+TEST_F(SchemaNotesTest, AClassBelowAnotherClassIsNamed)
+{
+    const auto document = [](const std::string& super) {
+        return Document(System() + Class("Element", "", KeyProperty("Id")) + Class("Device", "", KeyProperty("Id")) +
+                        Class("Disk", super, super.empty() ? KeyProperty("Id") : "") + Instance("Disk", Value("Id", "1")));
+    };
+    const std::string coverage = "No differences between a and b.\n"
+                                 "\n"
+                                 "Compared: 2 classes; 2 instances of a, 2 instances of b.\n"
+                                 "2 classes have no instances in any inventory.\n";
+    EXPECT_EQ(coverage + "Disk is below Element in a and below Device in b; rules are inherited as in a.\n",
+              Compare(document("Element"), document("Device")));
+    EXPECT_EQ(coverage + "Disk is a top-level class in a and below Device in b; rules are inherited as in a.\n",
+              Compare(document(""), document("Device")));
+    EXPECT_NE(std::string::npos, Compare(document(""), document("Device"), {"-o", "ndjson"})
+                                     .find("{\"kind\":\"superClassDiffers\",\"inventory\":\"b\",\"asIn\":\"a\",\"class\":\"Disk\","
+                                           "\"declared\":\"Device\",\"declaredAsIn\":\"\"}"));
+}
+
+/// Only the reference meets the others.
+TEST_F(SchemaNotesTest, InventoriesThatAreNotComparedWithEachOtherAreNotHeldAgainstEachOther)
+{
+    const auto disks = [](const std::string& more) { return Document(System() + Class("Disk", "", KeyProperty("Id") + more)); };
+    const std::string a = Scratch("a.xml", disks(""));
+    const std::string b = Scratch("b.xml", disks(Declaration("Size", "uint32")));
+    const std::string c = Scratch("c.xml", disks(Declaration("Size", "string")));
+    const std::string report = Named(Result({"compare", a, b, c}), a, b);
+    EXPECT_EQ("\nDeclared in a as in b: Disk.Size.\n", report.substr(report.find("\nDeclared")));
+    EXPECT_NE(std::string::npos, Result({"compare", b, a, c}).find("Of another type in "));
+}
+
+TEST_F(SchemaNotesTest, InstancesMatchUnderRulesThatExcludeTheKeyThatOneInventoryLacks)
+{
+    const auto disk = [](const std::string& declaration, const std::string& value) {
+        return Document(System() + Class("Disk", "", KeyProperty("Id") + declaration) + Instance("Disk", Value("Id", "1") + value));
+    };
+    const std::string less = disk("", "");
+    const std::string more = disk(KeyProperty("Bus"), Value("Bus", "x"));
+    EXPECT_EQ("2 differences between a and b: 1 instance only in a, 1 instance only in b\n", Compare(less, more).substr(0, 74));
+    const std::string rules =
+        Scratch("rules", "<DifftoolSpec><class name='Disk' default='include' excludekeys='Bus'/></DifftoolSpec>");
+    EXPECT_NE(std::string::npos, Compare(less, more, {"--spec", rules}).find("\n~ Id=\"1\"\n    Bus: NULL -> x\n")) << fOut;
+}
+
+TEST_F(SchemaNotesTest, ATimeOfCollectionIsLeftOutInEveryLetterCase)
+{
+    const auto collected = [](const std::string& name, const std::string& time) {
+        return Document(System() + Class("Disk", "", KeyProperty("Id") + Declaration(name, "string")) +
+                        Instance("Disk", Value("Id", "1") + Value(name, time)));
+    };
+    const std::string coverage = "No differences between a and b, times of collection aside.\n"
+                                 "\n"
+                                 "Compared: 2 classes; 2 instances of a, 2 instances of b.\n"
+                                 "Properties of Disk not compared: DateTimeOfCollection.\n";
+    const std::string inA = "Spelled in a as comparisons require: Disk.DateTimeOfCollection (was datetimeofcollection).\n";
+    const std::string inB = "Spelled in b as comparisons require: Disk.DateTimeOfCollection (was DATETIMEOFCOLLECTION).\n";
+    EXPECT_EQ(coverage + inA + inB, Compare(collected("datetimeofcollection", "x"), collected("DATETIMEOFCOLLECTION", "y")));
+    EXPECT_EQ(coverage + inB, Compare(collected("DateTimeOfCollection", "x"), collected("DATETIMEOFCOLLECTION", "y")));
+    EXPECT_NE(std::string::npos,
+              Compare(collected("datetimeofcollection", "x"), collected("DateTimeOfCollection", "y"), {"-o", "ndjson"})
+                  .find("{\"kind\":\"propertyRespelled\",\"inventory\":\"a\",\"asIn\":\"a\",\"class\":\"Disk\","
+                        "\"property\":\"DateTimeOfCollection\",\"before\":\"datetimeofcollection\"}"));
+}
+
+TEST_F(SchemaNotesTest, AnOperatingSystemIsMadeAfterTheStandardOneWithTheSmallestPath)
+{
+    const auto system = [](const std::string& name, const std::string& type) {
+        return Instance("Server", Value("Name", name) + Value("OSType", type, "uint16"));
+    };
+    const std::string declared = Class("CIM_OperatingSystem", "", KeyProperty("Name") + Declaration("OSType", "uint16")) +
+                                 Class("Server", "CIM_OperatingSystem", "");
+    const struct {
+        std::string contents;
+        std::string expected;
+    } rows[] = {
+        {declared + system("web", "58"), "web 58"},
+        {declared + system("web", "58") + system("db", "36"), "db 36"},
+        {declared + Instance("Server", Value("Name", "x")), "x 0"},
+        {declared, "unknown 0"},
+        {"", "unknown 0"},
+    };
+    for (const auto& row : rows) {
+        TFakeConsole console;
+        std::vector<TInventory> inventories = TInventoryLoader(console).Load({Scratch("a.xml", Document(row.contents))});
+        ASSERT_EQ(1U, MakeMissingOperatingSystems(inventories).size());
+        std::string made;
+        inventories[0]
+            .ns->FindClass("KALMO_OperatingSystem")
+            ->EnumerateInstances(
+                [&made](const boost::shared_ptr<ICIMInstance>& instance) {
+                    made += ValueOf(*instance, "Name").ToText() + " " + ValueOf(*instance, "OSType").ToText();
+                    return true;
+                },
+                false, TCallContext());
+        EXPECT_EQ(row.expected, made);
+    }
+}
+
+}  // namespace
+}  // namespace NORVZEL20
