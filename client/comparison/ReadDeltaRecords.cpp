@@ -11,6 +11,7 @@
 
 #include "client/inventory/CollectObjects.h"
 #include "client/inventory/PropertyValue.h"
+#include "embedded/value/TNameText.h"
 #include "provider/DeltaNames.h"
 
 namespace NORVZEL20 {
@@ -72,13 +73,34 @@ class TAssociationReader {
     std::vector<TDeltaRecord>* fCurrent = nullptr;
 };
 
-TCIMValue WithoutPosition(const TCIMValue& indices, std::size_t position)
+std::vector<boost::shared_ptr<ICIMInstance>> RecordsOf(TDeltaNamespace& ns, const char* recordClass)
+{
+    return Collect<ICIMInstance>([&](const auto& callback) { EnumerateAll(ns, recordClass, callback); });
+}
+
+TCIMValue WithoutPositions(const TCIMValue& indices, const std::vector<std::size_t>& positions)
 {
     std::vector<TCIMValue> kept = indices.GetElements();
-    kept.erase(
-        std::remove_if(kept.begin(), kept.end(), [position](const TCIMValue& index) { return index.GetUnsigned() == position; }),
-        kept.end());
+    kept.erase(std::remove_if(kept.begin(), kept.end(),
+                              [&positions](const TCIMValue& index) {
+                                  return std::find(positions.begin(), positions.end(), index.GetUnsigned()) != positions.end();
+                              }),
+               kept.end());
     return TCIMValue(indices.GetType(), static_cast<unsigned int>(kept.size()), kept);
+}
+
+// Returns whether positions are left.
+bool ReduceOrDelete(TDeltaNamespace& ns, const ICIMInstance& association, const std::vector<std::size_t>& positions)
+{
+    const TCIMReference path = ValueOf(association, kDeltaAssociationDelta);
+    const TCIMValue kept = WithoutPositions(ValueOf(*ns.GetInstance(path, TCallContext()), kDeltaRecordIndices), positions);
+    if (!kept.GetElements().empty()) {
+        ns.ModifyInstance(path, {{kDeltaRecordIndices, kept}}, TCallContext());
+        return true;
+    }
+    ns.DeleteInstance(association.GetReference(TCallContext()), TCallContext());
+    ns.DeleteInstance(path, TCallContext());
+    return false;
 }
 
 }  // namespace
@@ -97,10 +119,29 @@ std::map<std::string, std::vector<TDeltaRecord>> ReadDeltaRecords(TDeltaNamespac
 void RemovePosition(TDeltaNamespace& ns, std::size_t position)
 {
     // Collected first: changing instances during their enumeration is not allowed.
-    const auto deltas = Collect<ICIMInstance>([&ns](const auto& callback) { EnumerateAll(ns, kDeltaRecord, callback); });
-    for (const boost::shared_ptr<ICIMInstance>& delta : deltas) {
-        const TCIMValue kept = WithoutPosition(ValueOf(*delta, kDeltaRecordIndices), position);
+    for (const boost::shared_ptr<ICIMInstance>& delta : RecordsOf(ns, kDeltaRecord)) {
+        const TCIMValue kept = WithoutPositions(ValueOf(*delta, kDeltaRecordIndices), {position});
         ns.ModifyInstance(delta->GetReference(TCallContext()), {{kDeltaRecordIndices, kept}}, TCallContext());
+    }
+}
+
+void RemovePositionsOf(TDeltaNamespace& ns, const std::string& className, const std::vector<std::size_t>& positions)
+{
+    for (const boost::shared_ptr<ICIMInstance>& record : RecordsOf(ns, kClassRecord)) {
+        if (!TNameText::Equal(TextOf(*record, kClassRecordName), className)) {
+            continue;
+        }
+        const TCIMReference path = record->GetReference(TCallContext());
+        bool isAnyLeft = false;
+        for (const boost::shared_ptr<ICIMInstance>& association : RecordsOf(ns, kDeltaAssociation)) {
+            const TCIMReference ofClass = ValueOf(*association, kDeltaAssociationClass);
+            if (ofClass.GetPath() == path.GetPath()) {
+                isAnyLeft = ReduceOrDelete(ns, *association, positions) || isAnyLeft;
+            }
+        }
+        if (!isAnyLeft) {
+            ns.DeleteInstance(path, TCallContext());
+        }
     }
 }
 

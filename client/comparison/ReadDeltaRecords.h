@@ -16,4 +16,8 @@ std::map<std::string, std::vector<TDeltaRecord>> ReadDeltaRecords(TDeltaNamespac
 /// Removes one position from the indices of every record. Errors: TZELException of the namespace.
 void RemovePosition(TDeltaNamespace& ns, std::size_t position);
 
+/// Removes the positions from the records of one class, named in any letter case. A record that loses its last position is deleted,
+/// and so is the record of the class with its last difference. Errors: TZELException of the namespace.
+void RemovePositionsOf(TDeltaNamespace& ns, const std::string& className, const std::vector<std::size_t>& positions);
+
 }  // namespace NORVZEL20

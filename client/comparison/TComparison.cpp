@@ -17,6 +17,7 @@
 #include "client/comparison/TDifferenceReader.h"
 #include "client/files/TTemporaryFile.h"
 #include "client/inventory/CompleteInventories.h"
+#include "client/inventory/UncomparedSystems.h"
 #include "client/process/LackOfMemory.h"
 #include "client/process/TClientError.h"
 #include "client/process/TProgress.h"
@@ -74,7 +75,7 @@ TComparisonReport TComparison::Run(const std::optional<TRulesText>& rules, bool 
     }
     const TRulesText text =
         rules ? *rules
-              : TRulesText{"the rules made for " + fInventories[0].path, MakeRulesForEverything(fInventories[0], fNotes), true};
+              : TRulesText{"the rules made for " + fInventories[0].path, MakeRulesForEverything(fInventories, fNotes), true};
     TRules meaning(fInventories[0].ns, text);
     if (!text.isMade) {
         SayRuleWarnings(fConsole, text.name, meaning.GetDocument(), fInventories[0].ns);
@@ -124,6 +125,22 @@ void TComparison::FindDifferences(TDeltaNamespace& records, TRules& rules)
     }
     if (addTwice) {
         RemovePosition(records, fInventories.size());
+    }
+    RemoveMadeSystems(records);
+}
+
+// A made instance is there to let the run start. What the run says about it is not a difference.
+void TComparison::RemoveMadeSystems(TDeltaNamespace& records)
+{
+    std::vector<std::size_t> positions = FindMadeSystems(fNotes);
+    if (IsNoSystemCompared(fNotes, fInventories.size())) {
+        positions.clear();
+        for (std::size_t position = 0; position < fInventories.size(); ++position) {
+            positions.push_back(position);
+        }
+    }
+    if (!positions.empty()) {
+        RemovePositionsOf(records, kOperatingSystemClass, positions);
     }
 }
 

@@ -26,6 +26,7 @@ class TComparison {
   private:
     TComparisonReport RunWith(TRules& rules, const TRulesText& text);
     void FindDifferences(TDeltaNamespace& records, TRules& rules);
+    void RemoveMadeSystems(TDeltaNamespace& records);
     bool MustKeepReference() const;
 
     std::vector<TInventory>& fInventories;

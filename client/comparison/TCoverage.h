@@ -16,7 +16,7 @@ struct TCoverage {
         kReachedByNoElement,   ///< no element of the rules is for the class or one above it
         kNothingToCompare,     ///< the class has no property, or only the time of collection
         kUnknownToReference,   ///< the reference does not declare the class
-        kOperatingSystemMade,  ///< the rules exclude KALMO_OperatingSystem because the client made an instance of it
+        kOperatingSystemMade,  ///< the client made so many instances of KALMO_OperatingSystem that no real ones meet
     };
 
     /// One class that has instances in at least one inventory. Counts are of this class alone, one for each inventory.

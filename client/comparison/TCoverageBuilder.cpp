@@ -1,8 +1,9 @@
 // Which classes a comparison covers. The plug-in walks the class tree of the reference, so a class that has instances anywhere is
 //
 //   unknown to the reference    if that does not declare it;
-//   not compared                if there is no property to compare: because the client excluded the class by itself, because no
-//                               element reaches it, because it has none, or because its rules exclude them;
+//   made                        if it is KALMO_OperatingSystem and IsNoSystemCompared, whatever the rules say;
+//   not compared                if there is no property to compare: because no element reaches the class, because it has none, or
+//                               because its rules exclude them;
 //   compared                    otherwise.
 //
 // Of a compared class some things may still escape the comparison, and are listed: properties that the rules or the reference's
@@ -14,6 +15,7 @@
 #include <numeric>
 
 #include "client/comparison/DescribeExcludedKeys.h"
+#include "client/inventory/UncomparedSystems.h"
 #include "embedded/value/TNameText.h"
 #include "provider/DeltaNames.h"
 
@@ -48,7 +50,9 @@ void TCoverageBuilder::AddClass(TCoverage& coverage, const std::string& classNam
         return;
     }
     const std::vector<std::size_t> none(fInventories.size(), 0);
-    cls.madeIn = FindMade(className);
+    if (TNameText::Equal(className, kOperatingSystemClass)) {
+        cls.madeIn = FindMadeSystems(fNotes);
+    }
     cls.compared = cls.sharing = cls.sharingAlone = none;
     cls.state = Describe(cls);
     if (cls.state == TCoverage::kCompared) {
@@ -64,6 +68,9 @@ TCoverage::EState TCoverageBuilder::Describe(TCoverage::TClass& cls)
         return TCoverage::kUnknownToReference;
     }
     const std::vector<std::string> compared = fRules.PropertiesOf(declared);
+    if (!cls.madeIn.empty() && IsNoSystemCompared(fNotes, fInventories.size())) {
+        return TCoverage::kOperatingSystemMade;
+    }
     if (compared.empty()) {
         return WhyNothingIsCompared(cls, *declared);
     }
@@ -74,9 +81,6 @@ TCoverage::EState TCoverageBuilder::Describe(TCoverage::TClass& cls)
 
 TCoverage::EState TCoverageBuilder::WhyNothingIsCompared(const TCoverage::TClass& cls, const TInMemClass& declared) const
 {
-    if (!cls.madeIn.empty()) {
-        return TCoverage::kOperatingSystemMade;
-    }
     if (!fRules.Reach(cls.name)) {
         return TCoverage::kReachedByNoElement;
     }
@@ -124,17 +128,6 @@ std::vector<std::size_t> TCoverageBuilder::CountInstances(const std::string& cla
         counts.push_back(cls ? cls->GetInstanceCount() : 0);
     }
     return counts;
-}
-
-std::vector<std::size_t> TCoverageBuilder::FindMade(const std::string& className) const
-{
-    std::vector<std::size_t> inventories;
-    for (const TSchemaNote& note : fNotes) {
-        if (note.kind == TSchemaNote::kOperatingSystemMade && TNameText::Equal(note.className, className)) {
-            inventories.push_back(note.inventory);
-        }
-    }
-    return inventories;
 }
 
 }  // namespace NORVZEL20

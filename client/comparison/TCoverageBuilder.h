@@ -29,7 +29,6 @@ class TCoverageBuilder {
     void CountCompared(TCoverage::TClass& cls) const;
     std::vector<std::string> LeftOut(const std::string& className, const std::vector<std::string>& compared) const;
     std::vector<std::size_t> CountInstances(const std::string& className) const;
-    std::vector<std::size_t> FindMade(const std::string& className) const;
 
     const std::vector<TInventory>& fInventories;
     TRules& fRules;

@@ -50,19 +50,23 @@ const char* NoteName(TSchemaNote::EKind kind)
     }
 }
 
-TJson JsonOfCoveredClass(const TCoverage::TClass& cls)
+TJson JsonOfCoveredClass(const TComparisonReport& report, const TCoverage::TClass& cls)
 {
-    return {{"class", cls.name},
-            {"state", StateName(cls.state)},
-            {"instances", cls.instances},
-            {"propertiesLeftOut", cls.leftOut},
-            {"excludedKeys", cls.excludedKeys},
-            {"sharingKeys", cls.sharing},
-            {"instancesCompared", cls.compared},
-            {"ignoredKeys", cls.ignoredKeys},
-            {"sharingKeysWithoutPartner", cls.sharingAlone},
-            {"referencesReduced", cls.reducedReferences},
-            {"referenceKeysLeftOut", cls.referenceKeys}};
+    TJson json = {{"class", cls.name},
+                  {"state", StateName(cls.state)},
+                  {"instances", cls.instances},
+                  {"propertiesLeftOut", cls.leftOut},
+                  {"excludedKeys", cls.excludedKeys},
+                  {"sharingKeys", cls.sharing},
+                  {"instancesCompared", cls.compared},
+                  {"ignoredKeys", cls.ignoredKeys},
+                  {"sharingKeysWithoutPartner", cls.sharingAlone},
+                  {"referencesReduced", cls.reducedReferences},
+                  {"referenceKeysLeftOut", cls.referenceKeys}};
+    for (const std::size_t inventory : cls.madeIn) {
+        json["madeIn"].push_back(report.labels[inventory]);
+    }
+    return json;
 }
 
 TJson JsonOfNote(const TComparisonReport& report, const TSchemaNote& note)
@@ -90,7 +94,7 @@ nlohmann::ordered_json JsonOfCoverage(const TComparisonReport& report)
 {
     TJson classes = TJson::array();
     for (const TCoverage::TClass& cls : report.coverage.classes) {
-        classes.push_back(JsonOfCoveredClass(cls));
+        classes.push_back(JsonOfCoveredClass(report, cls));
     }
     TJson notes = TJson::array();
     for (const TSchemaNote& note : report.coverage.notes) {

@@ -3,6 +3,7 @@
 //   Compared: 2 classes; 30 instances of web01, 28 instances of web02.
 //   3 classes have no instances in any inventory.
 //   Not compared, because the rules exclude every property: Process (12 / 7).
+//   KALMO_OperatingSystem not compared in web03, because cimdelta made the instance there.
 //   Properties of Disk not compared: Caption, Model.
 //   Instances of Disk with the key of an earlier one, since the rules leave out Bus: 2 of web01, not compared; ...
 //   References of Mount were compared without key Bus and without their namespace.
@@ -63,6 +64,22 @@ class TStatement {
         WriteClasses(TCoverage::kNothingToCompare, "Not compared, because the class has no property to compare");
         WriteClasses(TCoverage::kUnknownToReference, "Not compared, because " + Label(0) + " does not declare the class");
         WriteClasses(TCoverage::kOperatingSystemMade, "Not compared, because cimdelta made it");
+        WriteMade();
+    }
+
+    // An operating system that is compared, but not in the inventories that have none of their own.
+    void WriteMade()
+    {
+        for (const TCoverage::TClass& cls : fCoverage.classes) {
+            std::vector<std::string> labels;
+            for (const std::size_t inventory : cls.madeIn) {
+                labels.push_back(Label(inventory));
+            }
+            if (cls.state == TCoverage::kCompared && !labels.empty()) {
+                fOut += EscapeForDisplay(cls.name) + " not compared in " + boost::algorithm::join(labels, ", ") +
+                        ", because cimdelta made the instance there.\n";
+            }
+        }
     }
 
     void WriteClasses(TCoverage::EState state, const std::string& title)

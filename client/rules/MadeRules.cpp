@@ -1,8 +1,7 @@
 #include "client/rules/MadeRules.h"
 
-#include <algorithm>
-
 #include "client/inventory/CollectObjects.h"
+#include "client/inventory/UncomparedSystems.h"
 #include "embedded/value/TValueXml.h"
 #include "host/RootClassName.h"
 #include "provider/DeltaNames.h"
@@ -19,21 +18,16 @@ std::string Element(const std::string& className, const char* treatment)
     return element + "/>\n";
 }
 
-bool IsMade(const std::vector<TSchemaNote>& notes)
-{
-    return std::any_of(notes.begin(), notes.end(),
-                       [](const TSchemaNote& note) { return note.kind == TSchemaNote::kOperatingSystemMade; });
-}
-
 }  // namespace
 
-std::string MakeRulesForEverything(const TInventory& reference, const std::vector<TSchemaNote>& notes)
+std::string MakeRulesForEverything(const std::vector<TInventory>& inventories, const std::vector<TSchemaNote>& notes)
 {
+    const TInventory& reference = inventories.front();
     std::string rules = "<?xml version=\"1.0\" encoding=\"UTF-8\"?>\n<DifftoolSpec version=\"1.0\">\n";
     for (const boost::shared_ptr<ICIMClass>& cls : SubclassesOf(*reference.ns->GetClass(kRootClassName, TCallContext()))) {
         rules += Element(cls->GetName(TCallContext()), "include");
     }
-    if (IsMade(notes)) {
+    if (IsNoSystemCompared(notes, inventories.size())) {
         const boost::shared_ptr<TInMemClass> made = reference.ns->FindClass(kOperatingSystemClass);
         // The class already has rules: from the loop above, or from the element of a class above it. This element replaces them.
         rules += Element(made->GetName(), "exclude");

@@ -8,8 +8,8 @@
 
 namespace NORVZEL20 {
 
-/// The text of a rules file that compares every property of every class of the reference, except a KALMO_OperatingSystem that the
-/// client itself made.
-std::string MakeRulesForEverything(const TInventory& reference, const std::vector<TSchemaNote>& notes);
+/// The text of a rules file that compares every property of every class of the reference, the first inventory.
+/// KALMO_OperatingSystem is left out if IsNoSystemCompared.
+std::string MakeRulesForEverything(const std::vector<TInventory>& inventories, const std::vector<TSchemaNote>& notes);
 
 }  // namespace NORVZEL20

@@ -188,23 +188,6 @@ TEST_F(CompareTest, NoDifferencesIsNotSaidOverInstancesThatShareAKey)
     EXPECT_EQ(0, fStatus);
 }
 
-TEST_F(CompareTest, AnOperatingSystemIsMadeAfterTheStandardOne)
-{
-    const std::string rules = Scratch("os", "<DifftoolSpec><class name='KALMO_OperatingSystem' default='include'/></DifftoolSpec>");
-    std::string text = ReadFile("other-schema.xml");
-    const std::string first = "<VALUE.OBJECT><INSTANCE CLASSNAME=\"ACME_OperatingSystem\">";
-    text.insert(text.find(first),
-                first + "<PROPERTY NAME=\"CreationClassName\" TYPE=\"string\"><VALUE>Z</VALUE></PROPERTY>"
-                        "<PROPERTY NAME=\"Name\" TYPE=\"string\"><VALUE>last</VALUE></PROPERTY></INSTANCE></VALUE.OBJECT>");
-    const std::string two = Scratch("two.xml", text);
-    for (const std::string& inventory : {std::string("other-schema.xml"), two}) {
-        Run({"compare", "-o", "ndjson", "--spec", rules, "web01.xml", inventory});
-        EXPECT_NE(std::string::npos, fOut.find("{\"kind\":\"onlyInOthers\",\"class\":\"KALMO_OperatingSystem\","
-                                               "\"instance\":\"KALMO_OperatingSystem.Name=\\\"acme\\\"\""))
-            << fOut;
-    }
-}
-
 TEST_F(CompareTest, AnOperatingSystemIsMadeIfTheClassHasNoInstance)
 {
     const std::string none = Scratch("none.xml", WithoutLast(ReadFile("empty-classes.xml")));

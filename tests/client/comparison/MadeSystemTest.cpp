@@ -1,0 +1,123 @@
+#include "tests/client/TPairFixture.h"
+
+namespace NORVZEL20 {
+namespace {
+
+/// Inventories without an operating system: the one that is made is never compared, and those of the others are.
+class MadeSystemTest : public TPairFixture {
+  protected:
+    void SetUp() override
+    {
+        TPairFixture::SetUp();
+        fFirst = Scratch("a.xml", Document(Real("old")));
+        fSecond = Scratch("b.xml", Document(Real("new")));
+        fThird = Scratch("c.xml", Document(Class("Disk", "", KeyProperty("Id"))));
+    }
+
+    static std::string Real(const std::string& version)
+    {
+        return Class("KALMO_OperatingSystem", "",
+                     KeyProperty("Name") + Declaration("OSType", "uint16") + Declaration("Version", "string")) +
+               Instance("KALMO_OperatingSystem",
+                        Value("Name", "host") + Value("OSType", "36", "uint16") + Value("Version", version));
+    }
+
+    /// The report on the inventories, named by the last letter of their labels.
+    std::string Report(const std::vector<std::string>& inventories, const std::vector<std::string>& options = {})
+    {
+        std::vector<std::string> arguments{"compare"};
+        arguments.insert(arguments.end(), inventories.begin(), inventories.end());
+        arguments.insert(arguments.end(), options.begin(), options.end());
+        Run(arguments);
+        std::string report = fOut;
+        for (const std::string& path : {fFirst, fSecond, fThird}) {
+            const std::string label = path.substr(path.rfind('/') + 1);
+            report = Shorten(Shorten(report, path, label.substr(label.size() - 5)), label.substr(0, label.size() - 4),
+                             label.substr(label.size() - 5, 1));
+        }
+        return report;
+    }
+
+    std::string Including()
+    {
+        return Scratch("rules", "<DifftoolSpec><class name='KALMO_OperatingSystem' default='include'/></DifftoolSpec>");
+    }
+
+    std::string fFirst;
+    std::string fSecond;
+    std::string fThird;
+};
+
+const char kOthersCompared[] = "1 difference between a and b, c: 1 changed value in 1 instance\n"
+                               "\n"
+                               "KALMO_OperatingSystem\n"
+                               "~ Name=\"host\"\n"
+                               "    Version: old -> b: new\n"
+                               "\n"
+                               "Compared: 1 class; 1 instance of a, 1 instance of b, 0 instances of c.\n"
+                               "1 class has no instances in any inventory.\n"
+                               "KALMO_OperatingSystem not compared in c, because cimdelta made the instance there.\n"
+                               "Declared in a as in c: class Disk.\n"
+                               "Declared in b as in c: class Disk.\n"
+                               "Made in c: an instance of KALMO_OperatingSystem.\n";
+
+TEST_F(MadeSystemTest, OneThatIsMadeHidesNoDifferenceAmongTheOthers)
+{
+    EXPECT_EQ(kOthersCompared, Report({fFirst, fSecond, fThird}));
+}
+
+TEST_F(MadeSystemTest, RulesThatIncludeTheClassChangeNothing)
+{
+    EXPECT_EQ(kOthersCompared, Report({fFirst, fSecond, fThird}, {"--spec", Including()}));
+}
+
+TEST_F(MadeSystemTest, JsonSaysWhereItIsNotCompared)
+{
+    const std::string report = Report({fFirst, fSecond, fThird}, {"-o", "ndjson"});
+    EXPECT_NE(std::string::npos, report.find("{\"class\":\"KALMO_OperatingSystem\",\"state\":\"compared\",\"instances\":[1,1,1],"))
+        << report;
+    EXPECT_NE(std::string::npos, report.find(",\"madeIn\":[\"c\"]")) << report;
+    EXPECT_NE(std::string::npos, report.find("\"everythingCompared\":false")) << report;
+}
+
+TEST_F(MadeSystemTest, NoRecordNamesTheInventory)
+{
+    const std::string records = Scratch("records.xml", Report({fFirst, fThird, fSecond}, {"-o", "cimxml"}));
+    EXPECT_EQ("{\"class\":\"KALMO_Delta\",\"instance\":\"KALMO_Delta.DeltaID=3\",\"properties\":{\"NamespaceIndices\":[2]}}\n",
+              Result({"query", "-o", "ndjson", "SELECT NamespaceIndices FROM KALMO_Delta", records}));
+}
+
+/// Two made instances beside one real one: nothing is left to compare.
+TEST_F(MadeSystemTest, WhereOnlyOneIsRealTheClassIsNotCompared)
+{
+    const std::string rules = Including();
+    const std::vector<std::vector<std::string>> sets{
+        {fFirst, fThird}, {fThird, fFirst}, {fThird, fFirst, fSecond}, {fFirst, fThird, fThird}};
+    for (const std::vector<std::string>& inventories : sets) {
+        for (const std::vector<std::string>& options : {std::vector<std::string>{}, {"--spec", rules}}) {
+            const std::string report = Report(inventories, options);
+            EXPECT_EQ("Nothing was compared between", report.substr(0, 28));
+            EXPECT_NE(std::string::npos, report.find("\nNot compared, because cimdelta made it: KALMO_OperatingSystem (1 / 1"))
+                << report;
+            EXPECT_EQ(std::string::npos, report.find("Version")) << report;
+        }
+        const std::string records = Scratch("records.xml", Report(inventories, {"--spec", rules, "-o", "cimxml"}));
+        for (const std::string record : {"KALMO_Delta", "KALMO_DeltaClass", "KALMO_DeltaClassAssocToDelta"}) {
+            EXPECT_EQ("", Result({"query", "-o", "ndjson", "SELECT * FROM " + record, records}));
+        }
+    }
+}
+
+TEST_F(MadeSystemTest, DifferencesOfOtherClassesStay)
+{
+    const auto disk = [](const std::string& size) {
+        return Class("Disk", "", KeyProperty("Id") + Declaration("Size", "string")) +
+               Instance("Disk", Value("Id", "1") + Value("Size", size));
+    };
+    const std::string report = Compare(Document(Real("old") + disk("1")), Document(disk("2")));
+    EXPECT_EQ("1 difference between a and b: 1 changed value in 1 instance\n\nDisk\n~ Id=\"1\"\n    Size: 1 -> 2\n",
+              report.substr(0, report.find("\nCompared")));
+}
+
+}  // namespace
+}  // namespace NORVZEL20
