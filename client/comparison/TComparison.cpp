@@ -11,6 +11,7 @@
 #include <algorithm>
 
 #include "client/comparison/ReadDeltaRecords.h"
+#include "client/comparison/ReferenceStandIns.h"
 #include "client/comparison/StaticValues.h"
 #include "client/comparison/TComparisonFault.h"
 #include "client/comparison/TCoverageBuilder.h"
@@ -72,6 +73,7 @@ TComparisonReport TComparison::Run(const std::optional<TRulesText>& rules, bool 
         fNotes = InspectInventories(fInventories);
     } else {
         fNotes = CompleteInventories(fInventories, fConsole);
+        PutReferenceStandIns(fInventories);
     }
     const TRulesText text =
         rules ? *rules

@@ -14,8 +14,8 @@ namespace NORVZEL20 {
 class TComparison {
   public:
     /// `inventories`, the reference first and at least two, and `console` must outlive this. The inventories may be changed: all
-    /// of them by CompleteInventories, and the reference by a run with exactly one other inventory, which brings it in line with
-    /// that one unless the two have different types, keys or static values.
+    /// of them by CompleteInventories and PutReferenceStandIns, and the reference by a run with exactly one other inventory, which
+    /// brings it in line with that one unless the two have different types, keys or static values.
     TComparison(std::vector<TInventory>& inventories, IConsole& console) : fInventories(inventories), fConsole(console) {}
 
     /// Compares under `rules`, or without them every class in every property. With `strictSchema` the inventories are not

@@ -16,19 +16,28 @@
 
 #include "client/comparison/ReadDeltaRecords.h"
 #include "client/inventory/CollectObjects.h"
-#include "client/inventory/PropertyValue.h"
 #include "embedded/store/TInMemProperty.h"
+#include "embedded/store/TInMemStaticProperty.h"
 
 namespace NORVZEL20 {
 
 namespace {
 
-// The value before the run. An instance that is not of the embedded host has no earlier value.
+// What the embedded host kept of a property that was changed; null if it was not changed.
+const TCIMValue* FindEarlier(const ICIMProperty& property)
+{
+    if (const auto* const stored = dynamic_cast<const TInMemProperty*>(&property)) {
+        return stored->GetEarlierValue();
+    }
+    const auto* const shared = dynamic_cast<const TInMemStaticProperty*>(&property);
+    return shared == nullptr ? nullptr : shared->GetEarlierValue();
+}
+
+// The value before the run, and before PutReferenceStandIns.
 TCIMValue ValueBefore(const ICIMInstance& instance, const std::string& property)
 {
     const boost::shared_ptr<ICIMProperty> handle = instance.GetProperty(property, TCallContext());
-    const TInMemProperty* stored = dynamic_cast<const TInMemProperty*>(handle.get());
-    const TCIMValue* earlier = stored == nullptr ? nullptr : stored->GetEarlierValue();
+    const TCIMValue* const earlier = FindEarlier(*handle);
     return earlier == nullptr ? handle->GetValue(TCallContext()) : *earlier;
 }
 
@@ -161,7 +170,7 @@ std::vector<TCIMValue> TDifferenceReader::OtherValues(const TDifference& differe
 {
     std::vector<TCIMValue> values;
     for (const boost::shared_ptr<ICIMInstance>& instance : Index(inventory).Find(difference.instance)) {
-        values.push_back(ValueOf(*instance, difference.property));
+        values.push_back(ValueBefore(*instance, difference.property));
     }
     if (values.size() > 1) {
         values.erase(std::remove_if(values.begin(), values.end(),

@@ -22,12 +22,12 @@ const TCIMValue& TInMemProperty::GetValue(TCallContext) const
 
 void TInMemProperty::SetValue(const TCIMValue& value, TCallContext)
 {
-    Change(TCIMValue(value), false);
+    Change(Fit(TCIMValue(value)), false);
 }
 
 void TInMemProperty::SetValue(TCIMValue&& value)
 {
-    Change(std::move(value), false);
+    Change(Fit(std::move(value)), false);
 }
 
 void TInMemProperty::MarkRemoved()
@@ -37,16 +37,25 @@ void TInMemProperty::MarkRemoved()
 
 void TInMemProperty::MarkChanged(const TCIMValue& value)
 {
-    Change(TCIMValue(value), true);
+    Change(Fit(TCIMValue(value)), true);
 }
 
-/// Everything that may fail comes first: checking the new value, and keeping the old one if it will be asked for. Then the value
-/// is set.
-void TInMemProperty::Change(TCIMValue&& value, bool isMarked)
+void TInMemProperty::MarkStandIn(TCIMValue value)
+{
+    Change(std::move(value), true);
+}
+
+TCIMValue TInMemProperty::Fit(TCIMValue&& value) const
+{
+    return GetInstance().GetInMemClass()->GetLayout().GetDecl(fSlot).Fit(std::move(value));
+}
+
+/// Everything that may fail comes first: the caller has checked the new value, and the old one is kept if it will be asked for.
+/// Then the value is set.
+void TInMemProperty::Change(TCIMValue&& fitting, bool isMarked)
 {
     TInMemInstance& instance = GetInstance();
     const TInMemPropertyDecl& decl = instance.GetInMemClass()->GetLayout().GetDecl(fSlot);
-    TCIMValue fitting = decl.Fit(std::move(value));
     // The index of the extent finds the instance by the key that it was added with.
     if (instance.IsAdded() && decl.IsKey()) {
         instance.KeepKey(fSlot, fValue);
@@ -61,7 +70,7 @@ void TInMemProperty::Change(TCIMValue&& value, bool isMarked)
 /// Unlike Change this keeps no earlier value and no key, because the value still means the same.
 void TInMemProperty::Rewrite(TCIMValue value)
 {
-    fValue = GetInstance().GetInMemClass()->GetLayout().GetDecl(fSlot).Fit(std::move(value));
+    fValue = Fit(std::move(value));
 }
 
 boost::shared_ptr<const ICIMPropertyDecl> TInMemProperty::GetPropertyDecl(TCallContext) const

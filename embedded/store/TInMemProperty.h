@@ -30,6 +30,9 @@ class CIMDELTA_EXPORT TInMemProperty final : public ICIMProperty {
     /// Writes the value in another way that means the same. If it is a key, the instance is found by the new value; the caller must
     /// then call TInMemNamespace::ReferenceTextsChanged. Errors: kTypeMismatch (13).
     void Rewrite(TCIMValue value);
+    /// As MarkChanged, with a value of any type: what a comparison is to see in the place of the value. A key with a stand-in does
+    /// not change which instance it is.
+    void MarkStandIn(TCIMValue value);
     bool IsChanged() const noexcept { return fChanged; }
     bool IsRemoved() const noexcept { return fRemoved; }
     /// What the property held before the first MarkChanged; null if there was none. Valid until another property of the instance
@@ -38,7 +41,8 @@ class CIMDELTA_EXPORT TInMemProperty final : public ICIMProperty {
 
   private:
     TInMemInstance& GetInstance() const noexcept;
-    void Change(TCIMValue&& value, bool isMarked);
+    void Change(TCIMValue&& fitting, bool isMarked);
+    TCIMValue Fit(TCIMValue&& value) const;
 
     TCIMValue fValue;
     std::uint32_t fSlot;           // in the layout of the class

@@ -28,8 +28,19 @@ void TInMemStaticProperty::MarkChanged(const TCIMValue& value)
 {
     const TCIMValue before = fState.value;
     SetValue(value);  // may fail, and then nothing is marked
+    KeepEarlier(before);
+}
+
+void TInMemStaticProperty::MarkStandIn(const TCIMValue& value)
+{
+    KeepEarlier(fState.value);
+    fState.value = value;
+}
+
+void TInMemStaticProperty::KeepEarlier(const TCIMValue& earlier)
+{
     if (!fState.isChanged) {
-        fState.earlier = before;
+        fState.earlier = earlier;
         fState.isChanged = true;
     }
 }

@@ -32,6 +32,8 @@ class CIMDELTA_EXPORT TInMemStaticProperty : public ICIMProperty {
 
     const TCIMValue& GetValue() const noexcept { return fState.value; }
     void SetValue(const TCIMValue& value);
+    /// See TInMemProperty::MarkStandIn.
+    void MarkStandIn(const TCIMValue& value);
     bool IsChanged() const noexcept { return fState.isChanged; }
     bool IsRemoved() const noexcept { return fState.isRemoved; }
     /// What it held before the first MarkChanged; null if there was none.
@@ -41,6 +43,8 @@ class CIMDELTA_EXPORT TInMemStaticProperty : public ICIMProperty {
     void SetState(const TState& state) noexcept { fState = state; }
 
   private:
+    void KeepEarlier(const TCIMValue& earlier);
+
     TInMemPropertyDecl& fDecl;
     TState fState;
 };

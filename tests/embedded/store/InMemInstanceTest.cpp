@@ -102,6 +102,28 @@ TEST_F(InMemInstanceTest, MarkChangedRemembersTheValueBeforeTheFirstChange)
     EXPECT_FALSE(Property(instance, "Size").IsChanged());
 }
 
+TEST_F(InMemInstanceTest, AStandInMayHaveAnyType)
+{
+    const auto instance = Add(fDisk, {{"Id", "sda"}, {"Label", "one"}});
+    Property(instance, "Label").MarkStandIn(TCIMValue(5U));
+    EXPECT_EQ(TCIMValue(5U), Property(instance, "Label").GetValue());
+    EXPECT_EQ(TCIMValue("one"), *Property(instance, "Label").GetEarlierValue());
+    Property(instance, "Id").MarkStandIn(TCIMValue(6U));
+    EXPECT_EQ("root/cimv2:Disk.Id=\"sda\"", instance->GetReference(kNoContext).GetPath());
+    EXPECT_EQ(instance, fNamespace->GetInstance(Path("Disk.Id=\"sda\""), kNoContext));
+}
+
+TEST_F(InMemInstanceTest, AStaticPropertyHasOneStandInForAllInstances)
+{
+    const auto cls = Declare("Model", nullptr, {{"Id", TType::kString, {"Key"}}, {"Firmware", TType::kString, {"Static"}}});
+    const auto one = Add(cls, {{"Id", "1"}, {"Firmware", "old"}});
+    const auto two = Add(cls, {{"Id", "2"}});
+    TInMemStaticProperty& shared = cls->FindPropertyDecl("Firmware")->GetStaticProperty();
+    shared.MarkStandIn(TCIMValue(5U));
+    EXPECT_EQ(TCIMValue(5U), two->GetProperty("Firmware", kNoContext)->GetValue(kNoContext));
+    EXPECT_EQ(TCIMValue("old"), *shared.GetEarlierValue());
+}
+
 TEST_F(InMemInstanceTest, AnEarlierNullIsAValueToo)
 {
     const auto instance = Add(fDisk, {{"Id", "sda"}});
