@@ -116,6 +116,18 @@ std::map<std::string, std::vector<TDeltaRecord>> ReadDeltaRecords(TDeltaNamespac
     return records;
 }
 
+bool ReadLastDeltaRecord(TDeltaNamespace& ns, std::string& className, TDeltaRecord& record)
+{
+    const std::vector<boost::shared_ptr<ICIMInstance>> classes = RecordsOf(ns, kClassRecord);
+    const std::vector<boost::shared_ptr<ICIMInstance>> deltas = RecordsOf(ns, kDeltaRecord);
+    if (classes.empty() || deltas.empty()) {
+        return false;
+    }
+    className = TextOf(*classes.back(), kClassRecordName);
+    record = MakeRecord(*deltas.back());
+    return true;
+}
+
 void RemovePosition(TDeltaNamespace& ns, std::size_t position)
 {
     // Collected first: changing instances during their enumeration is not allowed.

@@ -13,6 +13,9 @@ namespace NORVZEL20 {
 /// Reads with ExecuteQuery and GetInstance alone, as any client of the host could. Errors: TZELException of the namespace.
 std::map<std::string, std::vector<TDeltaRecord>> ReadDeltaRecords(TDeltaNamespace& ns);
 
+/// The record that was written last, and its class. Returns false if there is none. Errors: TZELException of the namespace.
+bool ReadLastDeltaRecord(TDeltaNamespace& ns, std::string& className, TDeltaRecord& record);
+
 /// Removes one position from the indices of every record. Errors: TZELException of the namespace.
 void RemovePosition(TDeltaNamespace& ns, std::size_t position);
 

@@ -120,8 +120,8 @@ void TComparison::FindDifferences(TDeltaNamespace& records, TRules& rules)
         records.FindDifferences();
     } catch (const TZELException& error) {
         ThrowIfOutOfMemory(error);
-        throw TClientError(
-            TComparisonFault{error.GetStatusCode(), error.what(), log.GetMessages(), fStrictSchema}.Describe(fInventories, rules));
+        throw TClientError(TComparisonFault{error.GetStatusCode(), error.what(), log.GetMessages(), fStrictSchema}.Describe(
+            fInventories, rules, records));
     } catch (const TAssertionFailure& error) {
         throw TClientError(std::string("the comparison failed: ") + error.what());
     }

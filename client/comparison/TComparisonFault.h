@@ -6,6 +6,7 @@
 #include "client/inventory/TInventory.h"
 #include "client/rules/TRules.h"
 #include "host/TZELStatusCode.h"
+#include "provider/TDeltaNamespace.h"
 
 namespace NORVZEL20 {
 
@@ -16,8 +17,9 @@ struct TComparisonFault {
     std::vector<std::string> log;  ///< what the plug-in logged, without line ends
     bool strictSchema;             ///< whether --strict-schema was given; without it, completion prevents most failures
 
-    /// The message for the person. `inventories` are those of the run, in its order. Cost: a walk over the reference's classes.
-    std::string Describe(const std::vector<TInventory>& inventories, TRules& rules) const;
+    /// The message for the person. The inventories are those of the run, in its order, and with `records` as the run has left them.
+    /// Errors: TZELException of a namespace. Cost: at most that of the run.
+    std::string Describe(const std::vector<TInventory>& inventories, TRules& rules, TDeltaNamespace& records) const;
 };
 
 }  // namespace NORVZEL20

@@ -87,13 +87,6 @@ void TDifferenceReader::StartClass(const std::string& className)
     fIndexes.clear();
     fIndexes.resize(fInventories.size());
     fByPath.clear();
-    const std::vector<std::string>& excluded = fRules.ExcludedKeysOf(className);
-    fKeyNames = KeyNamesOf(*fInventories[0].ns->GetClass(className, TCallContext()));
-    fKeyNames.erase(std::remove_if(fKeyNames.begin(), fKeyNames.end(),
-                                   [&excluded](const std::string& name) {
-                                       return std::find(excluded.begin(), excluded.end(), name) != excluded.end();
-                                   }),
-                    fKeyNames.end());
 }
 
 TDifference TDifferenceReader::Make(const TDeltaRecord& record)
@@ -149,10 +142,14 @@ const TInstanceIndex& TDifferenceReader::Index(std::size_t inventory)
     return *index;
 }
 
+// The keys are those of the instance's own class: with --strict-schema, another inventory may declare others than the reference.
 void TDifferenceReader::AddKeys(TDifference& difference, const ICIMInstance& instance) const
 {
-    for (const std::string& name : fKeyNames) {
-        difference.keys.push_back({name, ValueBefore(instance, name)});
+    const std::vector<std::string>& excluded = fRules.ExcludedKeysOf(fClassName);
+    for (const std::string& name : KeyNamesOf(*instance.GetClass(TCallContext()))) {
+        if (std::find(excluded.begin(), excluded.end(), name) == excluded.end()) {
+            difference.keys.push_back({name, ValueBefore(instance, name)});
+        }
     }
 }
 

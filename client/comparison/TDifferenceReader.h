@@ -35,7 +35,6 @@ class TDifferenceReader {
     const std::vector<TInventory>& fInventories;
     TRules& fRules;
     std::string fClassName;
-    std::vector<std::string> fKeyNames;                                        // the keys not excluded, of the class being read
     std::vector<std::unique_ptr<TInstanceIndex>> fIndexes;                     // of the class being read, made when first needed
     std::unordered_map<std::string, boost::shared_ptr<ICIMInstance>> fByPath;  // the reference's instances, likewise
 };
