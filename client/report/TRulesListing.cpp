@@ -15,6 +15,7 @@
 
 #include "client/inventory/CollectObjects.h"
 #include "client/inventory/RequireClass.h"
+#include "client/inventory/UncomparedSystems.h"
 #include "client/process/TClientError.h"
 #include "client/rules/DescribeReducedReferences.h"
 #include "client/rules/TSyntaxParser.h"
@@ -172,6 +173,7 @@ std::string TRulesListing::WriteExplanation(const std::string& className)
         AddLine("  matched without " + boost::algorithm::join(keys, ", ") + " (excludekeys, " + fText.name + ":" +
                 std::to_string(fTrace.Find(cls->GetName()).excludedKeysLine) + ")");
     }
+    AddMadeSystems(*cls, compared);
     for (const std::string& property : PropertyNames(*cls)) {
         AddLine("  " + Verdict(*cls, property, compared));
     }
@@ -187,8 +189,25 @@ std::string TRulesListing::WriteExplanation(const std::string& className, const 
         throw TClientError(fInventories.front().path + ": class " + cls->GetName() + " has no property " +
                            EscapeForDisplay(property) + "; cimdelta explain " + cls->GetName() + " lists those it has");
     }
-    AddLine(cls->GetName() + "." + Verdict(*cls, decl->GetName(), fRules.PropertiesOf(cls)));
+    const std::vector<std::string> compared = fRules.PropertiesOf(cls);
+    AddLine(cls->GetName() + "." + Verdict(*cls, decl->GetName(), compared));
+    AddMadeSystems(*cls, compared);
     return fOut;
+}
+
+// Rules cannot include what cimdelta has made.
+void TRulesListing::AddMadeSystems(const TInMemClass& cls, const std::vector<std::string>& compared)
+{
+    const std::vector<std::size_t> made = FindMadeSystems(fNotes);
+    if (made.empty() || compared.empty() || !TNameText::Equal(cls.GetName(), kOperatingSystemClass)) {
+        return;
+    }
+    std::vector<std::string> paths;
+    for (const std::size_t inventory : made) {
+        paths.push_back(fInventories[inventory].path);
+    }
+    AddLine((IsNoSystemCompared(fNotes, fInventories.size()) ? "  not compared at all" : "  not compared in these inventories") +
+            std::string(", since cimdelta made the instance of ") + SomeOf(paths));
 }
 
 bool TRulesListing::HasElement(const std::string& className) const

@@ -40,6 +40,7 @@ class TRulesListing {
     void WriteEffective(const boost::shared_ptr<TInMemClass>& cls);
     void WriteUnmatched();
     void WriteWarnings();
+    void AddMadeSystems(const TInMemClass& cls, const std::vector<std::string>& compared);
     bool HasElement(const std::string& className) const;
     std::vector<std::string> KeysLeftOut(const TInMemClass& cls);
     std::size_t CountInstances(const std::string& className) const;

@@ -108,6 +108,25 @@ TEST_F(MadeSystemTest, WhereOnlyOneIsRealTheClassIsNotCompared)
     }
 }
 
+TEST_F(MadeSystemTest, ExplainSaysThatRulesDoNotReachIt)
+{
+    const auto explain = [this](const std::string& element, const std::vector<std::string>& schemas) {
+        std::vector<std::string> arguments{"explain", element, "--spec", Including()};
+        for (const std::string& schema : schemas) {
+            arguments.insert(arguments.end(), {"--schema", schema});
+        }
+        Run(arguments);
+        return Shorten(Shorten(fOut, fThird, "c.xml"), fFirst, "a.xml");
+    };
+    EXPECT_NE(std::string::npos, explain("KALMO_OperatingSystem", {fFirst, fSecond, fThird})
+                                     .find("\n  not compared in these inventories, since cimdelta made the instance of c.xml\n"))
+        << fOut;
+    EXPECT_NE(std::string::npos, explain("KALMO_OperatingSystem.Name", {fThird, fFirst})
+                                     .find("\n  not compared at all, since cimdelta made the instance of c.xml\n"))
+        << fOut;
+    EXPECT_EQ(std::string::npos, explain("KALMO_OperatingSystem", {fFirst, fSecond}).find("cimdelta made")) << fOut;
+}
+
 TEST_F(MadeSystemTest, DifferencesOfOtherClassesStay)
 {
     const auto disk = [](const std::string& size) {
