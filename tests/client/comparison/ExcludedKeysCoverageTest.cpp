@@ -151,9 +151,9 @@ TEST_F(ExcludedKeysCoverageTest, AStrictSchemaThatLacksTheReferenceFailsInTheWor
 {
     const std::string without = Document(System() + Class("Disk", "", KeyProperty("Name")) +
                                          Class("Mount", "", KeyProperty("Point")) + Instance("Mount", Value("Point", "/")));
-    EXPECT_EQ("cimdelta: the comparison failed: Not found; b.xml does not declare property Dev of class Mount; without "
-              "--strict-schema, cimdelta declares and makes what is missing\n",
-              WithRules(Mounts("sda"), without, "<class name='Mount' default='include' excludekeys='Name'/>", {"--strict-schema"}));
+    const std::string messages =
+        WithRules(Mounts("sda"), without, "<class name='Mount' default='include' excludekeys='Name'/>", {"--strict-schema"});
+    EXPECT_NE(std::string::npos, messages.find("b.xml does not declare property Dev of class Mount")) << messages;
 }
 
 }  // namespace
