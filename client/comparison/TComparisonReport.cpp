@@ -13,6 +13,7 @@ TComparisonReport::TCounts TComparisonReport::Count() const
             break;
         case TDifference::kOnlyInOthers:
             ++counts.onlyInOthers;
+            counts.instancesOnlyInOthers += difference.CountInstances();
             break;
         case TDifference::kChanged:
             ++counts.changedValues;

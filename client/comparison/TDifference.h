@@ -1,10 +1,12 @@
 #pragma once
 
+#include <algorithm>
 #include <cstddef>
 #include <string>
 #include <utility>
 #include <vector>
 
+#include "client/comparison/TValueDifference.h"
 #include "host/TCIMValue.h"
 
 namespace NORVZEL20 {
@@ -17,25 +19,41 @@ struct TDifference {
         kChanged           ///< a property whose value in `inventories` is not the reference's
     };
 
-    /// One value and the inventories that have it.
-    struct TGroup {
-        std::vector<std::size_t> inventories;  ///< ascending
-        TCIMValue value;
-    };
-
     EKind kind;
     std::string className;
     std::string instance;                                 ///< the key by which instances were matched, as path text
     std::vector<std::pair<std::string, TCIMValue>> keys;  ///< the same, key by key, in the class's order
-    std::string property;                                 ///< only of kChanged
-    std::vector<std::size_t> inventories;                 ///< the positions of those that differ, ascending, each once
-    TCIMValue reference;                                  ///< only of kChanged: the reference's value before the run
-    std::vector<TGroup> others;                           ///< only of kChanged: the values of `inventories`, equal ones together
+    bool hasKeys = true;                                  ///< whether the class has keys; otherwise it has one instance at most
+    std::string path;                      ///< only of kOnlyInReference, if the rules exclude keys: the instance's whole path
+    std::string property;                  ///< only of kChanged
+    std::vector<std::size_t> inventories;  ///< the positions of those that differ, ascending, each once
+    /// For each inventory of the run, how many instances have the key. Only the reference and `inventories` are counted. Empty if
+    /// the rules exclude no key, so no two instances share one.
+    std::vector<std::size_t> sharing;
+    /// Of kChanged: the property. Of kOnlyInOthers: each compared property in which the instances of `inventories` differ from one
+    /// another, ascending by name.
+    std::vector<TValueDifference> values;
 
-    /// The instance's key without the class: `Key1="v",Key2=5`; empty if the rules exclude every key.
+    /// The instance's key without the class: `Key1="v",Key2=5`; empty if the class has no keys or the rules exclude all of them.
     std::string GetKeyText() const
     {
         return instance.size() > className.size() ? instance.substr(className.size() + 1) : std::string();
+    }
+
+    /// How many instances of the inventory share the key; 0 if only one has it, or none.
+    std::size_t CountSharing(std::size_t inventory) const
+    {
+        return sharing.empty() || sharing[inventory] < 2 ? 0 : sharing[inventory];
+    }
+
+    /// How many instances the difference is about: as many as the inventory has that has most instances with the key.
+    std::size_t CountInstances() const
+    {
+        std::size_t most = 1;
+        for (const std::size_t inventory : inventories) {
+            most = std::max(most, CountSharing(inventory));
+        }
+        return most;
     }
 };
 

@@ -2,8 +2,11 @@
 //
 // A record names a class, an instance, a property and the positions of inventories, but no value. The values are looked up:
 //   instance removed    the keys of the reference's instance
-//   instance added      the keys of the instance in the first inventory that has it
-//   property changed    the reference's value, and the value of each inventory concerned; inventories with equal values are grouped
+//   instance added      the keys of the instance in the first inventory that has it, and the properties in which the instances
+//                       that have the key differ from one another: the plug-in does not compare these
+//   property changed    the reference's value, and the value of each inventory concerned
+//
+// Inventories with equal values are grouped. Whether values are equal is asked of the plug-in.
 //
 // After a run with two inventories the reference holds the other one's values. The embedded host keeps what a property held before
 // its first change; a report shows this earlier value.
@@ -16,6 +19,7 @@
 
 #include "client/comparison/ReadDeltaRecords.h"
 #include "client/inventory/CollectObjects.h"
+#include "client/inventory/FindDeclarations.h"
 #include "embedded/store/TInMemProperty.h"
 #include "embedded/store/TInMemStaticProperty.h"
 
@@ -41,24 +45,11 @@ TCIMValue ValueBefore(const ICIMInstance& instance, const std::string& property)
     return earlier == nullptr ? handle->GetValue(TCallContext()) : *earlier;
 }
 
-// Equal and written alike: datetimes with different offsets from UTC can be equal, but a report shows their texts.
-bool LookEqual(const TCIMValue& a, const TCIMValue& b)
+// The instance's value, or null if its class lacks the property. That is possible with --strict-schema only.
+TCIMValue ValueIfDeclared(const ICIMInstance& instance, const std::string& property)
 {
-    return a == b && a.ToText() == b.ToText();
-}
-
-void AddToGroups(std::vector<TDifference::TGroup>& groups, std::size_t inventory, const TCIMValue& value)
-{
-    for (TDifference::TGroup& group : groups) {
-        if (LookEqual(group.value, value)) {
-            // Instances that share a key may bring the same value twice.
-            if (group.inventories.back() != inventory) {
-                group.inventories.push_back(inventory);
-            }
-            return;
-        }
-    }
-    groups.push_back({{inventory}, value});
+    const boost::shared_ptr<ICIMClass> cls = instance.GetClass(TCallContext());
+    return FindPropertyDecl(*cls, property) ? ValueBefore(instance, property) : TCIMValue();
 }
 
 bool StandsBefore(const TDifference& a, const TDifference& b)
@@ -87,6 +78,11 @@ void TDifferenceReader::StartClass(const std::string& className)
     fIndexes.clear();
     fIndexes.resize(fInventories.size());
     fByPath.clear();
+    const boost::shared_ptr<ICIMClass> cls = fInventories[0].ns->GetClass(className, TCallContext());
+    fProperties = fRules.PropertiesOf(cls);
+    std::sort(fProperties.begin(), fProperties.end());
+    fExcludesKeys = !fRules.ExcludedKeysOf(className).empty();
+    fHasKeys = !KeyNamesOf(*cls).empty();
 }
 
 TDifference TDifferenceReader::Make(const TDeltaRecord& record)
@@ -96,32 +92,35 @@ TDifference TDifferenceReader::Make(const TDeltaRecord& record)
     difference.instance = record.instanceName;
     difference.property = record.property;
     difference.inventories = record.inventories;
+    difference.hasKeys = fHasKeys;
     boost::shared_ptr<ICIMInstance> instance;
     switch (record.type) {
     case TDeltaNamespace::kInstanceRemoved:
         difference.kind = TDifference::kOnlyInReference;
         instance = FindByPath(record.instanceName);
         difference.instance = fRules.KeyOf(fClassName, instance);
+        difference.path = fExcludesKeys ? record.instanceName : std::string();
         break;
     case TDeltaNamespace::kInstanceAdded:
         difference.kind = TDifference::kOnlyInOthers;
         instance = Index(difference.inventories.front()).Find(record.instanceName).at(0);
+        AddDisagreements(difference);
         break;
     case TDeltaNamespace::kPropertyChanged:
         difference.kind = TDifference::kChanged;
         instance = Index(0).Find(record.instanceName).at(0);
-        difference.reference = ValueBefore(*instance, record.property);
-        AddValues(difference);
+        AddChange(difference, *instance);
         break;
     }
     AddKeys(difference, *instance);
+    CountSharing(difference);
     return difference;
 }
 
 // The reference's instance that a record of a removed instance names: by its key, or by its own path if the class excludes keys.
 boost::shared_ptr<ICIMInstance> TDifferenceReader::FindByPath(const std::string& path)
 {
-    if (fRules.ExcludedKeysOf(fClassName).empty()) {
+    if (!fExcludesKeys) {
         return Index(0).Find(path).at(0);
     }
     if (fByPath.empty()) {
@@ -153,28 +152,69 @@ void TDifferenceReader::AddKeys(TDifference& difference, const ICIMInstance& ins
     }
 }
 
-void TDifferenceReader::AddValues(TDifference& difference)
+// If instances of an inventory share the key, only some of them may differ from the reference.
+void TDifferenceReader::AddChange(TDifference& difference, const ICIMInstance& reference)
 {
+    TValueDifference change;
+    change.property = difference.property;
+    change.reference = ValueBefore(reference, difference.property);
     for (const std::size_t inventory : difference.inventories) {
-        for (const TCIMValue& value : OtherValues(difference, inventory)) {
-            AddToGroups(difference.others, inventory, value);
+        const TInstanceIndex::TInstances& instances = Index(inventory).Find(difference.instance);
+        for (const boost::shared_ptr<ICIMInstance>& instance : instances) {
+            const TCIMValue value = ValueBefore(*instance, difference.property);
+            if (instances.size() == 1 || fRules.Differ(fClassName, change.reference, value)) {
+                AddToGroups(change.others, inventory, value);
+            }
+        }
+    }
+    difference.values.push_back(change);
+}
+
+void TDifferenceReader::AddDisagreements(TDifference& difference)
+{
+    std::vector<std::pair<std::size_t, boost::shared_ptr<ICIMInstance>>> instances;
+    for (const std::size_t inventory : difference.inventories) {
+        for (const boost::shared_ptr<ICIMInstance>& instance : Index(inventory).Find(difference.instance)) {
+            instances.push_back({inventory, instance});
+        }
+    }
+    for (std::size_t i = 0; instances.size() > 1 && i < fProperties.size(); ++i) {
+        TValueDifference values;
+        values.property = fProperties[i];
+        for (const auto& [inventory, instance] : instances) {
+            AddToGroups(values.others, inventory, ValueIfDeclared(*instance, values.property));
+        }
+        if (values.others.size() > 1) {
+            difference.values.push_back(values);
         }
     }
 }
 
-// The inventory's value. If keys are excluded, several instances may share the key: then all values that are not the reference's.
-std::vector<TCIMValue> TDifferenceReader::OtherValues(const TDifference& difference, std::size_t inventory)
+void TDifferenceReader::AddToGroups(std::vector<TValueDifference::TGroup>& groups, std::size_t inventory, const TCIMValue& value)
 {
-    std::vector<TCIMValue> values;
-    for (const boost::shared_ptr<ICIMInstance>& instance : Index(inventory).Find(difference.instance)) {
-        values.push_back(ValueBefore(*instance, difference.property));
+    auto group = std::find_if(groups.begin(), groups.end(), [&](const TValueDifference::TGroup& candidate) {
+        return !fRules.Differ(fClassName, candidate.value, value);
+    });
+    if (group == groups.end()) {
+        groups.push_back({{}, {}, value});
+        group = groups.end() - 1;
     }
-    if (values.size() > 1) {
-        values.erase(std::remove_if(values.begin(), values.end(),
-                                    [&](const TCIMValue& value) { return LookEqual(value, difference.reference); }),
-                     values.end());
+    group->Add(inventory, 1);
+}
+
+// The reference lacks the instance of an added key. After a run with two inventories it has a copy, which does not count.
+void TDifferenceReader::CountSharing(TDifference& difference)
+{
+    if (!fExcludesKeys) {
+        return;
     }
-    return values;
+    difference.sharing.assign(fInventories.size(), 0);
+    for (const std::size_t inventory : difference.inventories) {
+        difference.sharing[inventory] = Index(inventory).Find(difference.instance).size();
+    }
+    if (difference.kind != TDifference::kOnlyInOthers) {
+        difference.sharing[0] = Index(0).Find(difference.instance).size();
+    }
 }
 
 }  // namespace NORVZEL20

@@ -29,12 +29,17 @@ class TDifferenceReader {
     boost::shared_ptr<ICIMInstance> FindByPath(const std::string& path);
     const TInstanceIndex& Index(std::size_t inventory);
     void AddKeys(TDifference& difference, const ICIMInstance& instance) const;
-    void AddValues(TDifference& difference);
-    std::vector<TCIMValue> OtherValues(const TDifference& difference, std::size_t inventory);
+    void AddChange(TDifference& difference, const ICIMInstance& reference);
+    void AddDisagreements(TDifference& difference);
+    void AddToGroups(std::vector<TValueDifference::TGroup>& groups, std::size_t inventory, const TCIMValue& value);
+    void CountSharing(TDifference& difference);
 
     const std::vector<TInventory>& fInventories;
     TRules& fRules;
     std::string fClassName;
+    bool fHasKeys = true;                                                      // of the class being read
+    bool fExcludesKeys = false;                                                // likewise
+    std::vector<std::string> fProperties;                                      // likewise; those compared, ascending
     std::vector<std::unique_ptr<TInstanceIndex>> fIndexes;                     // of the class being read, made when first needed
     std::unordered_map<std::string, boost::shared_ptr<ICIMInstance>> fByPath;  // the reference's instances, likewise
 };

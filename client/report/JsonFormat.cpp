@@ -3,10 +3,8 @@
 //   { "format": "cimdelta-comparison", "version": 1,
 //     "inventories": [ { "label": "web01", "file": "web01.xml", "role": "reference", "instancesCompared": 2 } ],
 //     "summary": { "differences": 1, "onlyInReference": 0, "onlyInOthers": 0, "changedValues": 1, "changedInstances": 1,
-//                  "everythingCompared": false, "nothingCompared": false },
-//     "differences": [ { "kind": "changed", "class": "Disk", "instance": "Disk.Id=\"sda\"", "keys": { "Id": "sda" },
-//                        "inventories": [ "web02" ], "property": "Size", "reference": { "type": "uint64", "value": 500 },
-//                        "others": [ { "inventories": [ "web02" ], "type": "uint64", "value": 250 } ] } ],
+//                  "instancesOnlyInOthers": 0, "everythingCompared": false, "nothingCompared": false },
+//     "differences": [ ... ],
 //     "coverage": { "classes": [ { "class": "Disk", "state": "compared", "instances": [ 1, 1 ], "propertiesLeftOut": [ "Model" ],
 //                                  "excludedKeys": [], "sharingKeys": [ 0, 0 ], "instancesCompared": [ 1, 1 ],
 //                                  "ignoredKeys": [], "sharingKeysWithoutPartner": [ 0, 0 ], "referencesReduced": false,
@@ -15,72 +13,18 @@
 //                   "schema": [ { "kind": "propertyDeclared", "inventory": "web02", "asIn": "web01", "class": "Disk",
 //                                 "property": "Model" } ] } }
 //
-// A difference of another kind ends with its inventories. Lists of numbers have one for each inventory, the reference first.
+// JsonDifference.cpp shows the differences. Lists of numbers have one for each inventory, the reference first.
 #include "client/report/JsonFormat.h"
 
 #include "client/report/JsonCoverage.h"
+#include "client/report/JsonDifference.h"
 #include "client/report/JsonValue.h"
-#include "embedded/value/TValueText.h"
 
 namespace NORVZEL20 {
 
 namespace {
 
 using TJson = nlohmann::ordered_json;
-
-const char* KindName(TDifference::EKind kind)
-{
-    switch (kind) {
-    case TDifference::kOnlyInReference:
-        return "onlyInReference";
-    case TDifference::kOnlyInOthers:
-        return "onlyInOthers";
-    default:
-        return "changed";
-    }
-}
-
-TJson Labels(const TComparisonReport& report, const std::vector<std::size_t>& inventories)
-{
-    TJson labels = TJson::array();
-    for (const std::size_t inventory : inventories) {
-        labels.push_back(report.labels[inventory]);
-    }
-    return labels;
-}
-
-TJson ValueWithType(const TCIMValue& value)
-{
-    return {{"type", TValueText::DescribeType(value.GetType())}, {"value", JsonOf(value)}};
-}
-
-void AddValues(TJson& json, const TComparisonReport& report, const TDifference& difference)
-{
-    json["property"] = difference.property;
-    json["reference"] = ValueWithType(difference.reference);
-    TJson others = TJson::array();
-    for (const TDifference::TGroup& group : difference.others) {
-        TJson other = {{"inventories", Labels(report, group.inventories)}};
-        other.update(ValueWithType(group.value));
-        others.push_back(other);
-    }
-    json["others"] = others;
-}
-
-TJson JsonOfDifference(const TComparisonReport& report, const TDifference& difference)
-{
-    TJson keys = TJson::object();
-    for (const auto& key : difference.keys) {
-        keys[key.first] = JsonOf(key.second);
-    }
-    TJson json = {
-        {"kind", KindName(difference.kind)}, {"class", difference.className}, {"instance", difference.instance}, {"keys", keys}};
-    json["inventories"] = Labels(report, difference.inventories);
-    if (difference.kind == TDifference::kChanged) {
-        AddValues(json, report, difference);
-    }
-    return json;
-}
 
 TJson JsonOfSummary(const TComparisonReport& report)
 {
@@ -90,6 +34,7 @@ TJson JsonOfSummary(const TComparisonReport& report)
             {"onlyInOthers", counts.onlyInOthers},
             {"changedValues", counts.changedValues},
             {"changedInstances", counts.changedInstances},
+            {"instancesOnlyInOthers", counts.instancesOnlyInOthers},
             {"everythingCompared", report.coverage.IsComplete()},
             {"nothingCompared", report.coverage.IsNothingCompared()}};
 }

@@ -10,19 +10,18 @@
 //
 //   Compared: 1 class; ...
 //
-// "-" is an instance of the reference that others lack, "+" one that only others have, "~" one with changed values. A value of the
-// reference stands before the arrow; inventories with equal values share one behind it. If there are only two inventories, the
-// names in brackets and before values are left out.
+// "-" is an instance of the reference that others lack, "+" one that only others have, "~" one with changed values. TDifferenceText
+// explains the lines of one difference.
 #include "client/report/TTextFormat.h"
 
-#include <algorithm>
 #include <boost/algorithm/string/join.hpp>
 #include <numeric>
 
+#include "client/report/DisplayLabels.h"
+#include "client/report/TDifferenceText.h"
 #include "client/report/TextCoverage.h"
 #include "client/text/Counted.h"
 #include "client/text/DisplayText.h"
-#include "embedded/value/TValueText.h"
 
 namespace NORVZEL20 {
 
@@ -74,7 +73,7 @@ std::string TTextFormat::Kinds(const TComparisonReport::TCounts& counts) const
                         (IsPair() ? " only in " + Labels({0}) : " of " + Labels({0}) + " missing elsewhere"));
     }
     if (counts.onlyInOthers > 0) {
-        kinds.push_back(Counted(counts.onlyInOthers, "instance") + " only " + (IsPair() ? "in " + Others() : "elsewhere"));
+        kinds.push_back(Counted(counts.instancesOnlyInOthers, "instance") + " only " + (IsPair() ? "in " + Others() : "elsewhere"));
     }
     if (counts.changedValues > 0) {
         kinds.push_back(Counted(counts.changedValues, "changed value") + " in " + Counted(counts.changedInstances, "instance"));
@@ -99,62 +98,25 @@ void TTextFormat::WriteDifferences()
 
 void TTextFormat::WriteDifference(const TDifference& difference, bool sameInstance)
 {
+    const TDifferenceText text(fReport, difference);
     switch (difference.kind) {
     case TDifference::kOnlyInReference:
-        fOut += Paint(kRed, "- " + InstanceText(difference) + Missing(difference)) + "\n";
+        fOut += Paint(kRed, "- " + text.Instance()) + "\n";
         break;
     case TDifference::kOnlyInOthers:
-        fOut += Paint(kGreen, "+ " + InstanceText(difference) + Added(difference)) + "\n";
+        fOut += Paint(kGreen, "+ " + text.Instance()) + "\n";
         break;
     case TDifference::kChanged:
         if (!sameInstance) {
-            fOut += Paint(kYellow, "~ " + InstanceText(difference)) + "\n";
+            fOut += Paint(kYellow, "~ " + text.Instance()) + "\n";
         }
-        fOut += "    " + EscapeForDisplay(difference.property) + ": " + Values(difference) + "\n";
     }
-}
-
-std::string TTextFormat::Missing(const TDifference& difference) const
-{
-    return IsPair() ? std::string() : "  (not in " + Labels(difference.inventories) + ")";
-}
-
-std::string TTextFormat::Added(const TDifference& difference) const
-{
-    return IsPair() ? std::string() : "  (in " + Labels(difference.inventories) + ")";
-}
-
-std::string TTextFormat::Values(const TDifference& difference) const
-{
-    std::vector<std::string> groups;
-    for (const TDifference::TGroup& group : difference.others) {
-        groups.push_back((IsPair() ? std::string() : Labels(group.inventories) + ": ") + OneValue(difference, group.value));
-    }
-    return OneValue(difference, difference.reference) + " -> " + boost::algorithm::join(groups, " / ");
-}
-
-// If the types differ, the type stands before the value: the values themselves may look alike.
-std::string TTextFormat::OneValue(const TDifference& difference, const TCIMValue& value) const
-{
-    const bool typesDiffer = std::any_of(difference.others.begin(), difference.others.end(), [&](const TDifference::TGroup& group) {
-        return group.value.GetType() != difference.reference.GetType();
-    });
-    return (typesDiffer ? TValueText::DescribeType(value.GetType()) + " " : std::string()) + DisplayValue(value);
-}
-
-std::string TTextFormat::InstanceText(const TDifference& difference) const
-{
-    const std::string keys = difference.GetKeyText();
-    return keys.empty() ? "(all instances of the class; the rules exclude every key)" : EscapeForDisplay(keys);
+    fOut += text.Values();
 }
 
 std::string TTextFormat::Labels(const std::vector<std::size_t>& inventories) const
 {
-    std::vector<std::string> labels;
-    for (const std::size_t inventory : inventories) {
-        labels.push_back(DisplayLabel(fReport.labels[inventory]));
-    }
-    return boost::algorithm::join(labels, ", ");
+    return DisplayLabels(fReport, inventories);
 }
 
 std::string TTextFormat::Others() const

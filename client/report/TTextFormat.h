@@ -22,11 +22,6 @@ class TTextFormat {
     std::string Kinds(const TComparisonReport::TCounts& counts) const;
     void WriteDifferences();
     void WriteDifference(const TDifference& difference, bool sameInstance);
-    std::string Missing(const TDifference& difference) const;
-    std::string Added(const TDifference& difference) const;
-    std::string Values(const TDifference& difference) const;
-    std::string OneValue(const TDifference& difference, const TCIMValue& value) const;
-    std::string InstanceText(const TDifference& difference) const;
     std::string Labels(const std::vector<std::size_t>& inventories) const;
     std::string Others() const;
     std::string Paint(const char* color, const std::string& text) const;

@@ -50,12 +50,17 @@ void AppendEscape(std::string& out, char32_t code)
     }
 }
 
-// Whether the text needs no quotes. " -> " and " / " separate values in a report.
+bool Contains(std::string_view text, std::string_view part)
+{
+    return text.find(part) != std::string_view::npos;
+}
+
+// Whether the text needs no quotes.
 bool StandsBare(std::string_view text, const std::string& escaped)
 {
     return !text.empty() && text.front() != ' ' && text.back() != ' ' && escaped == text && text != "NULL" &&
-           text.find_first_of("\"\\") == std::string_view::npos && text.find(" -> ") == std::string_view::npos &&
-           text.find(" / ") == std::string_view::npos;
+           text.find_first_of("\"\\") == std::string_view::npos && !Contains(text, kBeforeNewValue) &&
+           !Contains(text, kBetweenValues) && !Contains(text, kWithThisKey);
 }
 
 std::string Quote(std::string_view text)

@@ -16,9 +16,14 @@ std::string EscapeForDisplay(std::string_view text);
 /// the quotes a backslash stands before each quote. Different labels stay different.
 std::string DisplayLabel(std::string_view label);
 
+// What reports put between and behind values.
+inline constexpr char kBeforeNewValue[] = " -> ";
+inline constexpr char kBetweenValues[] = " / ";
+inline constexpr char kWithThisKey[] = " with this key";
+
 /// A value for people, in one line; NULL for null. Text is put in double quotes if it is empty, begins or ends with a blank, reads
-/// NULL, or holds a quote, a backslash, a character that EscapeForDisplay replaces, or " -> " or " / ", which reports use between
-/// values. Within the quotes a backslash stands before each quote and backslash. Other text is shown as it is.
+/// NULL, or holds a quote, a backslash, a character that EscapeForDisplay replaces, or one of the texts above. Within the quotes a
+/// backslash stands before each quote and backslash. Other text is shown as it is.
 std::string DisplayValue(const TCIMValue& value);
 
 }  // namespace NORVZEL20

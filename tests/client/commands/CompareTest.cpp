@@ -154,7 +154,7 @@ TEST_F(CompareTest, InstancesThatShareAKeyAreReported)
         "\n"
         "INV_Disk\n"
         "~ Device=\"sda\"\n"
-        "    SizeMB: 500 -> 900\n"
+        "    SizeMB: 500 -> 900 (one of 2 instances of two-boots with this key)\n"
         "+ Device=\"sdb\"\n"
         "\n"
         "INV_Package\n"
@@ -200,8 +200,8 @@ TEST_F(CompareTest, AnOperatingSystemIsMadeIfTheClassHasNoInstance)
 
 TEST_F(CompareTest, AnInstanceGoneUnderExcludedKeysIsFoundByItsPath)
 {
-    EXPECT_NE(std::string::npos,
-              Result({"compare", "--spec", "rules.xml", "two-boots.xml", "web02.xml"}).find("INV_Disk\n- Device=\"sdb\"\n\n"));
+    EXPECT_NE(std::string::npos, Result({"compare", "--spec", "rules.xml", "two-boots.xml", "web02.xml"})
+                                     .find("INV_Disk\n- Device=\"sdb\"  (path: root/cimv2:INV_Disk.BootId=1,Device=\"sdb\")\n\n"));
 }
 
 TEST_F(CompareTest, WhatAnotherInventoryDeclaresIsDeclaredAndReported)

@@ -42,7 +42,7 @@ TEST_F(FormatsTest, NdjsonHasADocumentForEachDifferenceAndOneForTheCoverage)
             "{\"label\":\"web02\",\"file\":\"web02.xml\",\"role\":\"other\",\"instancesCompared\":2},"
             "{\"label\":\"web03\",\"file\":\"web03.xml\",\"role\":\"other\",\"instancesCompared\":2}],"
             "\"summary\":{\"differences\":4,\"onlyInReference\":1,\"onlyInOthers\":1,\"changedValues\":2,\"changedInstances\":1,"
-            "\"everythingCompared\":false,\"nothingCompared\":false},"
+            "\"instancesOnlyInOthers\":1,\"everythingCompared\":false,\"nothingCompared\":false},"
             "\"classes\":[") +
             CoveredClass("INV_Disk", "compared", "1,1,1", "1,1,1") + "," +
             CoveredClass("INV_Package", "reachedByNoElement", "3,3,4", "0,0,0") + "," +

@@ -1,0 +1,19 @@
+#include "client/comparison/TValueDifference.h"
+
+#include <algorithm>
+
+namespace NORVZEL20 {
+
+void TValueDifference::TGroup::Add(std::size_t inventory, std::size_t count)
+{
+    const auto found = std::lower_bound(inventories.begin(), inventories.end(), inventory);
+    const auto at = found - inventories.begin();
+    if (found != inventories.end() && *found == inventory) {
+        instances[static_cast<std::size_t>(at)] += count;
+        return;
+    }
+    inventories.insert(found, inventory);
+    instances.insert(instances.begin() + at, count);
+}
+
+}  // namespace NORVZEL20

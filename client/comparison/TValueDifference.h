@@ -1,0 +1,28 @@
+#pragma once
+
+#include <cstddef>
+#include <string>
+#include <vector>
+
+#include "host/TCIMValue.h"
+
+namespace NORVZEL20 {
+
+/// A property whose values are not all equal.
+struct TValueDifference {
+    /// One value and the inventories that have it.
+    struct TGroup {
+        std::vector<std::size_t> inventories;  ///< ascending
+        std::vector<std::size_t> instances;    ///< for each of `inventories`, how many of its instances have the value
+        TCIMValue value;                       ///< of the first of them; the others' are equal under the rules
+
+        /// Notes `count` more instances of `inventory`.
+        void Add(std::size_t inventory, std::size_t count);
+    };
+
+    std::string property;
+    TCIMValue reference;         ///< the reference's value before the run; meaningless if the reference lacks the instance
+    std::vector<TGroup> others;  ///< the values that are not the reference's, equal ones together
+};
+
+}  // namespace NORVZEL20

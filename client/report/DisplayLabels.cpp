@@ -1,0 +1,18 @@
+#include "client/report/DisplayLabels.h"
+
+#include <boost/algorithm/string/join.hpp>
+
+#include "client/text/DisplayText.h"
+
+namespace NORVZEL20 {
+
+std::string DisplayLabels(const TComparisonReport& report, const std::vector<std::size_t>& inventories)
+{
+    std::vector<std::string> labels;
+    for (const std::size_t inventory : inventories) {
+        labels.push_back(DisplayLabel(report.labels[inventory]));
+    }
+    return boost::algorithm::join(labels, ", ");
+}
+
+}  // namespace NORVZEL20
