@@ -17,6 +17,7 @@
 #include <algorithm>
 #include <tuple>
 
+#include "client/comparison/EmbeddedParts.h"
 #include "client/comparison/ReadDeltaRecords.h"
 #include "client/inventory/CollectObjects.h"
 #include "client/inventory/FindDeclarations.h"
@@ -167,6 +168,7 @@ void TDifferenceReader::AddChange(TDifference& difference, const ICIMInstance& r
             }
         }
     }
+    AddEmbeddedParts(change, true);
     difference.values.push_back(change);
 }
 
@@ -185,6 +187,7 @@ void TDifferenceReader::AddDisagreements(TDifference& difference)
             AddToGroups(values.others, inventory, ValueIfDeclared(*instance, values.property));
         }
         if (values.others.size() > 1) {
+            AddEmbeddedParts(values, false);
             difference.values.push_back(values);
         }
     }

@@ -23,6 +23,9 @@ struct TValueDifference {
     std::string property;
     TCIMValue reference;         ///< the reference's value before the run; meaningless if the reference lacks the instance
     std::vector<TGroup> others;  ///< the values that are not the reference's, equal ones together
+    /// Of embedded instances: the same difference property by property, if that says all; see EmbeddedParts.h. The property is then
+    /// a path such as `Settings.Speed`.
+    std::vector<TValueDifference> parts;
 };
 
 }  // namespace NORVZEL20

@@ -10,10 +10,13 @@
 //     "disagreements": [ { "property": "Size", "others": [ ... ] } ] }
 //
 // "sharing" is there only if several instances of an inventory have the key: beside "inventories" it says how many, beside a value
-// how many of them have the value. "path" is there only if the rules exclude keys, "disagreements" only if there are any.
+// how many of them have the value. A value that is an embedded object has "embedded" with its contents (see ContentsOf), and if all
+// values are instances of one class, "parts" behind "others" has the properties in which they differ, each as "property",
+// "reference", "others" and perhaps "parts". "path" is there only if the rules exclude keys, "disagreements" only if there are any.
 #include "client/report/JsonDifference.h"
 
 #include "client/report/JsonValue.h"
+#include "client/text/EmbeddedText.h"
 #include "embedded/value/TValueText.h"
 
 namespace NORVZEL20 {
@@ -36,7 +39,11 @@ const char* KindName(TDifference::EKind kind)
 
 TJson ValueWithType(const TCIMValue& value)
 {
-    return {{"type", TValueText::DescribeType(value.GetType())}, {"value", JsonOf(value)}};
+    TJson json = {{"type", TValueText::DescribeType(value.GetType())}, {"value", JsonOf(value)}};
+    if (HasEmbeddedObject(value)) {
+        json["embedded"] = ContentsOf(value);
+    }
+    return json;
 }
 
 // Makes the parts of one difference, which are all made with its report.
@@ -106,6 +113,9 @@ class TDifferenceWriter {
         }
         for (const TValueDifference::TGroup& group : values.others) {
             json["others"].push_back(Group(group));
+        }
+        for (const TValueDifference& part : values.parts) {
+            json["parts"].push_back(Values(part));
         }
         return json;
     }

@@ -1,6 +1,11 @@
 #include "client/report/JsonValue.h"
 
 #include <cmath>
+#include <map>
+
+#include "client/text/EmbeddedText.h"
+#include "embedded/value/TEmbeddedObject.h"
+#include "embedded/value/TNameText.h"
 
 namespace NORVZEL20 {
 
@@ -52,6 +57,33 @@ nlohmann::ordered_json JsonOf(const TCIMValue& value)
     default:
         return value.ToText();
     }
+}
+
+nlohmann::ordered_json ContentsOf(const TCIMValue& value)
+{
+    if (!HasEmbeddedObject(value)) {
+        return nullptr;
+    }
+    if (value.GetType().IsArray()) {
+        TJson elements = TJson::array();
+        for (const TCIMValue& element : value.GetElements()) {
+            elements.push_back(ContentsOf(element));
+        }
+        return elements;
+    }
+    const boost::shared_ptr<const TEmbeddedObject> object = value.GetEmbeddedObject();
+    if (object->IsClass()) {
+        return {{"classDeclaration", object->GetClassName()}};
+    }
+    std::map<std::string, TJson, TNameText::TLess> sorted;
+    for (const TEmbeddedObject::TProperty& property : object->GetProperties()) {
+        sorted[property.name] = HasEmbeddedObject(property.value) ? ContentsOf(property.value) : JsonOf(property.value);
+    }
+    TJson properties = TJson::object();
+    for (const auto& [name, contents] : sorted) {
+        properties[name] = contents;
+    }
+    return {{"class", object->GetClassName()}, {"properties", properties}};
 }
 
 std::string WriteJson(const nlohmann::ordered_json& document, bool indented)

@@ -11,6 +11,11 @@ namespace NORVZEL20 {
 /// is a string: text, datetimes, references (as path text), embedded objects (as CIM-XML), and the reals "NaN", "INF" and "-INF".
 nlohmann::ordered_json JsonOf(const TCIMValue& value);
 
+/// What an embedded instance consists of: { "class": "Cfg", "properties": { "Speed": 100 } }, in ascending order of the names; for
+/// an embedded class { "classDeclaration": "Cfg" }. An array has one of these for each element, or null for plain text. Null for
+/// any other value.
+nlohmann::ordered_json ContentsOf(const TCIMValue& value);
+
 /// The document's text with a line end: indented by two blanks, or in one line. Bytes that are not UTF-8 become U+FFFD.
 std::string WriteJson(const nlohmann::ordered_json& document, bool indented);
 

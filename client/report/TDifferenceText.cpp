@@ -5,18 +5,18 @@
 //
 //   Id="sdc"  (the first of 2 instances of web01 with this key)
 //       Size: 500 -> 250 (one of 2 instances of web02 with this key)  an instance that the reference has
+//   Id="sdd"
+//       Settings.Speed: 100 -> 200                                    embedded instances, by the properties that differ
 //
 // A value of the reference stands before the arrow; inventories with equal values share one behind it. If there are only two
 // inventories, the names before values are left out. Several instances have the same key only if the rules exclude keys.
 #include "client/report/TDifferenceText.h"
 
-#include <algorithm>
 #include <boost/algorithm/string/join.hpp>
 
 #include "client/report/DisplayLabels.h"
 #include "client/text/Counted.h"
 #include "client/text/DisplayText.h"
-#include "embedded/value/TValueText.h"
 
 namespace NORVZEL20 {
 
@@ -65,25 +65,32 @@ std::string TDifferenceText::SharingRemark(std::size_t inventory, const std::str
 
 std::string TDifferenceText::Values() const
 {
+    return Lines(fDifference.values);
+}
+
+// The parts of a difference stand for the whole.
+std::string TDifferenceText::Lines(const std::vector<TValueDifference>& differences) const
+{
     std::string lines;
-    for (const TValueDifference& values : fDifference.values) {
-        lines += Line(values);
+    for (const TValueDifference& values : differences) {
+        lines += values.parts.empty() ? Line(values) : Lines(values.parts);
     }
     return lines;
 }
 
 std::string TDifferenceText::Line(const TValueDifference& values) const
 {
+    const TValueTexts texts(values, HasReference());
     std::vector<std::string> groups;
     for (const TValueDifference::TGroup& group : values.others) {
-        groups.push_back(Group(values, group));
+        groups.push_back(Group(texts, group));
     }
     return "    " + EscapeForDisplay(values.property) + ": " +
-           (HasReference() ? OneValue(values, values.reference) + kBeforeNewValue : std::string()) +
+           (HasReference() ? texts.Get(values.reference) + kBeforeNewValue : std::string()) +
            boost::algorithm::join(groups, kBetweenValues) + "\n";
 }
 
-std::string TDifferenceText::Group(const TValueDifference& values, const TValueDifference::TGroup& group) const
+std::string TDifferenceText::Group(const TValueTexts& texts, const TValueDifference::TGroup& group) const
 {
     std::vector<std::string> remarks;
     for (std::size_t i = 0; i < group.inventories.size(); ++i) {
@@ -91,7 +98,7 @@ std::string TDifferenceText::Group(const TValueDifference& values, const TValueD
             remarks.push_back(ShareRemark(group.inventories[i], group.instances[i]));
         }
     }
-    return (IsPair() ? std::string() : DisplayLabels(fReport, group.inventories) + ": ") + OneValue(values, group.value) +
+    return (IsPair() ? std::string() : DisplayLabels(fReport, group.inventories) + ": ") + texts.Get(group.value) +
            (remarks.empty() ? std::string() : " (" + boost::algorithm::join(remarks, ", ") + ")");
 }
 
@@ -104,15 +111,6 @@ std::string TDifferenceText::ShareRemark(std::size_t inventory, std::size_t coun
     }
     return which + std::to_string(fDifference.CountSharing(inventory)) +
            (IsPair() ? std::string() : " of " + DisplayLabels(fReport, {inventory})) + kWithThisKey;
-}
-
-// If the types differ, the type stands before the value: the values themselves may look alike.
-std::string TDifferenceText::OneValue(const TValueDifference& values, const TCIMValue& value) const
-{
-    const TCIMValue::TCIMType first = HasReference() ? values.reference.GetType() : values.others.front().value.GetType();
-    const bool typesDiffer = std::any_of(values.others.begin(), values.others.end(),
-                                         [first](const TValueDifference::TGroup& group) { return group.value.GetType() != first; });
-    return (typesDiffer ? TValueText::DescribeType(value.GetType()) + " " : std::string()) + DisplayValue(value);
 }
 
 }  // namespace NORVZEL20

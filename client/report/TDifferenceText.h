@@ -4,6 +4,7 @@
 #include <vector>
 
 #include "client/comparison/TComparisonReport.h"
+#include "client/report/TValueTexts.h"
 
 namespace NORVZEL20 {
 
@@ -21,10 +22,10 @@ class TDifferenceText {
     std::string Name() const;
     std::vector<std::string> Remarks() const;
     std::string SharingRemark(std::size_t inventory, const std::string& which) const;
+    std::string Lines(const std::vector<TValueDifference>& differences) const;
     std::string Line(const TValueDifference& values) const;
-    std::string Group(const TValueDifference& values, const TValueDifference::TGroup& group) const;
+    std::string Group(const TValueTexts& texts, const TValueDifference::TGroup& group) const;
     std::string ShareRemark(std::size_t inventory, std::size_t count) const;
-    std::string OneValue(const TValueDifference& values, const TCIMValue& value) const;
     bool HasReference() const { return fDifference.kind == TDifference::kChanged; }
     bool IsPair() const { return fReport.labels.size() == 2; }
 

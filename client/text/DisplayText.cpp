@@ -63,18 +63,6 @@ bool StandsBare(std::string_view text, const std::string& escaped)
            !Contains(text, kBetweenValues) && !Contains(text, kWithThisKey);
 }
 
-std::string Quote(std::string_view text)
-{
-    std::string doubled;
-    for (const char character : text) {
-        if (character == '"' || character == '\\') {
-            doubled += '\\';
-        }
-        doubled += character;
-    }
-    return '"' + EscapeForDisplay(doubled) + '"';
-}
-
 }  // namespace
 
 std::string EscapeForDisplay(std::string_view text)
@@ -111,6 +99,18 @@ std::string DisplayLabel(std::string_view label)
     return '"' + EscapeForDisplay(quoted) + '"';
 }
 
+std::string QuoteForDisplay(std::string_view text)
+{
+    std::string doubled;
+    for (const char character : text) {
+        if (character == '"' || character == '\\') {
+            doubled += '\\';
+        }
+        doubled += character;
+    }
+    return '"' + EscapeForDisplay(doubled) + '"';
+}
+
 std::string DisplayValue(const TCIMValue& value)
 {
     const std::string text = value.ToText();
@@ -121,7 +121,7 @@ std::string DisplayValue(const TCIMValue& value)
     if (value.GetType() != TCIMValue::TCIMType::kString || StandsBare(text, escaped)) {
         return escaped;
     }
-    return Quote(text);
+    return QuoteForDisplay(text);
 }
 
 }  // namespace NORVZEL20

@@ -16,6 +16,9 @@ std::string EscapeForDisplay(std::string_view text);
 /// the quotes a backslash stands before each quote. Different labels stay different.
 std::string DisplayLabel(std::string_view label);
 
+/// Text in double quotes, with a backslash before each quote and backslash of its own, and escaped as by EscapeForDisplay.
+std::string QuoteForDisplay(std::string_view text);
+
 // What reports put between and behind values.
 inline constexpr char kBeforeNewValue[] = " -> ";
 inline constexpr char kBetweenValues[] = " / ";
