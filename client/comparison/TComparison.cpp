@@ -12,6 +12,7 @@
 
 #include "client/comparison/ReadDeltaRecords.h"
 #include "client/comparison/ReferenceStandIns.h"
+#include "client/comparison/RefuseRecordKeys.h"
 #include "client/comparison/StaticValues.h"
 #include "client/comparison/TComparisonFault.h"
 #include "client/comparison/TCoverageBuilder.h"
@@ -80,6 +81,7 @@ TComparisonReport TComparison::Run(const std::optional<TRulesText>& rules, bool 
               : TRulesText{"the rules made for " + fInventories[0].path, MakeRulesForEverything(fInventories, fNotes), true};
     TRules meaning(fInventories[0].ns, text);
     if (!text.isMade) {
+        RefuseRecordKeys(fInventories, meaning, text.name);
         SayRuleWarnings(fConsole, text.name, meaning.GetDocument(), fInventories[0].ns);
     }
     return RunWith(meaning, text);

@@ -20,6 +20,7 @@
 
 #include "client/inventory/CollectObjects.h"
 #include "client/rules/DescribeReducedReferences.h"
+#include "client/rules/RecordClasses.h"
 #include "client/text/SomeOf.h"
 #include "embedded/value/TNameText.h"
 
@@ -48,6 +49,7 @@ TRuleWarnings::TRuleWarnings(const TRulesDocument& document, const TRuleTrace& t
     }
     if (fIsSchemaKnown) {
         CheckReferences();
+        CheckRecordClasses();
     }
     std::stable_sort(fWarnings.begin(), fWarnings.end(), [](const TWarning& a, const TWarning& b) {
         return std::tie(a.element, a.line) < std::tie(b.element, b.line);
@@ -202,6 +204,17 @@ void TRuleWarnings::CheckReferences()
         Warn(index, fElements[index].line,
              "excludekeys also applies to references: those in " + SomeOf(properties) + " are compared " +
                  DescribeReducedReferences(fElements[index].excludedKeys));
+    }
+}
+
+void TRuleWarnings::CheckRecordClasses()
+{
+    for (const boost::shared_ptr<ICIMClass>& cls : AllClassesOf(*fSchema)) {
+        const std::string& className = cls->GetName(TCallContext());
+        const std::optional<std::size_t> index = fMarks.FindKeys(className);
+        if (IsRecordClass(className) && index && !fElements[*index].excludedKeys.empty()) {
+            Warn(*index, fElements[*index].line, DescribeRecordKeys(className));
+        }
     }
 }
 

@@ -38,6 +38,7 @@ class TRuleWarnings {
     void CheckOverruled(std::size_t index);
     void CheckDefault(std::size_t index);
     void CheckReferences();
+    void CheckRecordClasses();
     void Warn(std::size_t index, unsigned int line, const std::string& text);
 
     std::string LineOf(std::size_t index) const;
