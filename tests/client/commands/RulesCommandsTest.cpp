@@ -209,6 +209,33 @@ TEST_F(RulesCommandsTest, WithoutASchemaCheckReadsTheRulesAlone)
               Shorten(Complaint({"check", wrong}), wrong, "R"));
 }
 
+TEST_F(RulesCommandsTest, WithoutASchemaCheckRefusesWhatNoSchemaCanDeclare)
+{
+    for (const auto& [cls, property] : {std::pair<std::string, std::string>{"INV_Disk", ""}, {"&lt;root&gt;", "Name"}}) {
+        const std::string rules = Scratch("never", "<DifftoolSpec><class name='" + cls + "'><includelist><value>" + property +
+                                                       "</value></includelist></class></DifftoolSpec>");
+        const std::string complaint = Complaint({"check", rules});
+        EXPECT_NE(std::string::npos, complaint.find(" has no property \"" + property + "\"; the name counts")) << complaint;
+    }
+}
+
+/// It would say of an element that matches nothing because it comes too late that the inventories are the reason.
+TEST_F(RulesCommandsTest, AnElementWithoutEffectIsOnlyWarnedOf)
+{
+    const std::string element = "<class name='INV_Package' default='include'/>\n";
+    const std::string rules = Scratch("late", "<DifftoolSpec>\n" + element + element + element + "</DifftoolSpec>");
+    const std::string listing = Shorten(Result({"check", rules, "--schema", "empty-classes.xml"}), rules, "R");
+    EXPECT_EQ(
+        "Rules that matched nothing:\n"
+        "  R:2: class INV_Package has no instances, nor has any class below it\n"
+        "  R:3: class INV_Package has no instances, nor has any class below it\n"
+        "\n"
+        "Warnings:\n"
+        "  R:4: this element for class INV_Package has no effect: the element at line 3 completed the rules of the class; put what "
+        "is meant into that one\n",
+        listing.substr(std::min(listing.size(), listing.find("Rules that matched nothing"))));
+}
+
 TEST_F(RulesCommandsTest, WithoutRulesExplainShowsThatEverythingIsCompared)
 {
     EXPECT_EQ("INV_Package.Version: compared, by default, since everything is compared without --spec\n",
