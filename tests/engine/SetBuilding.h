@@ -4,8 +4,12 @@
 
 #include "tests/engine/NaiveSet.h"
 #include "tests/support/TComparisonRun.h"
+#include "tests/support/TNamespaceBuilder.h"
 
 namespace NORVZEL20 {
+
+/// Adds the classes and instances to the builder's namespace.
+void BuildNamespace(const TNaiveNamespace& plain, TNamespaceBuilder& builder);
 
 /// The specification of a set, as a document.
 std::string RulesOf(const TNaiveSet& set);

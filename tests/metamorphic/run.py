@@ -1,0 +1,165 @@
+"""Runs the relations over random inventories, over the inventories of this repository and over the random sets of the engine's tests.
+
+    run.py PART --program CIMDELTA --root ROOT [--sets PROGRAM] [--seed N] [--count N] [--features LIST] [--only NAME] [--keep FOLDER]
+
+PART is `random`, `rules` (random inventories with random rules), `files`, `sets`, or `compare`, which checks the report on the inventories that
+follow (`run.py compare --program P --root R [--rules RULES] REFERENCE OTHER...`). A failure prints the seed, what is wrong and the smallest documents
+that show it, and keeps them in a folder. The exit status is 0 if nothing was wrong, 1 if something was, and 2 if the run could not be made.
+"""
+
+import argparse
+import pathlib
+import subprocess
+import sys
+import tempfile
+import traceback
+
+try:
+    import lxml.etree  # noqa: F401, first of all, for a message that says what to do
+except ImportError:
+    sys.exit("tests/metamorphic needs lxml: apt-get install python3-lxml, and run it with /usr/bin/python3")
+
+import generator
+import program
+import relations
+import shrinking
+
+COUNTS = {"random": 24, "rules": 24, "sets": 150, "files": 1}
+FIRST_SEED = 1
+MAY_OCCUR = ("schemas",)
+SHOWN_BYTES = 6000
+FAULTS_SHOWN = 5
+
+
+class Runner:
+    def __init__(self, arguments, scratch):
+        self.arguments = arguments
+        self.run = program.Program(arguments.program, arguments.root, scratch)
+        self.keep = pathlib.Path(arguments.keep)
+        self.failures = 0
+        self.cases = 0
+
+    def relations(self):
+        return [one for one in relations.ALL if self.arguments.only in (None, one.__name__)]
+
+    def faults(self, relation, case):
+        try:
+            return list(relation(case))
+        except program.Refusal as refusal:
+            return [f"refused: {refusal}"]
+        except Exception:  # the checker met what it does not know; that is a fault too, of one of the two
+            return [f"the checker failed: {traceback.format_exc(limit=-3)}"]
+
+    def case(self, name, documents, rules, seed, chosen=None):
+        self.cases += 1
+        case = relations.Case(self.run, documents, rules, seed)
+        for relation in chosen or self.relations():
+            found = self.faults(relation, case)
+            if found:
+                self.report(name, case, relation, found)
+        self.run.forget()
+
+    def report(self, name, case, relation, found):
+        self.failures += 1
+        print(f"{name}: {relation.__name__}:")
+        for fault in found[:FAULTS_SHOWN]:
+            print(f"    {fault[:1500]}")
+        kind = kind_of(found[0])
+
+        def fails(documents, rules):
+            smaller = relations.Case(self.run, documents, rules, case.seed)
+            return any(kind_of(fault) == kind for fault in self.faults(relation, smaller))
+
+        documents = shrinking.Shrinker(fails).shrink(case.documents, case.rules)
+        folder = self.keep / f"{name}-{relation.__name__}".replace("/", "-").replace(" ", "-")
+        folder.mkdir(parents=True, exist_ok=True)
+        files = documents + ([("rules.xml", case.rules)] if case.rules is not None else [])
+        print(f"    the smallest documents that show it, in {folder}:")
+        for file_name, data in files:
+            (folder / file_name).write_bytes(data)
+            print(f"    {file_name}: {data[:SHOWN_BYTES].decode(errors='replace')}")
+        for fault in self.faults(relation, relations.Case(self.run, documents, case.rules, case.seed))[:FAULTS_SHOWN]:
+            print(f"    then: {fault[:1500]}")
+
+    # Parts.
+
+    def random_inventories(self, with_rules):
+        first, count = self.arguments.seed, self.arguments.count
+        for seed in range(first, first + count):
+            made = generator.Generator(seed, self.arguments.features)
+            documents = [(f"{chr(97 + index)}.xml", data) for index, data in enumerate(made.make_documents(2 + seed % 3))]
+            self.case(f"seed {seed}", documents, made.make_rules() if with_rules else None, seed)
+
+    def files(self):
+        for names, rules in FILES:
+            documents = [(f"{number}{pathlib.Path(name).name}", (self.arguments.root / name).read_bytes()) for number, name in enumerate(names)]
+            self.case(" ".join(names), documents, (self.arguments.root / rules).read_bytes() if rules else None, self.arguments.seed)
+
+    def sets(self):
+        """What the engine's random tests compare, as files."""
+        first, count = self.arguments.seed, self.arguments.count
+        with tempfile.TemporaryDirectory(prefix="cimdelta-sets-") as folder:
+            subprocess.run([self.arguments.sets, folder, str(first), str(count)], check=True)
+            for seed in range(first, first + count):
+                paths = sorted((pathlib.Path(folder) / str(seed)).glob("[0-9]*.xml"))
+                if len(paths) > 1:
+                    rules = (paths[0].parent / "rules.xml").read_bytes()
+                    documents = [(path.name, path.read_bytes()) for path in paths]
+                    self.case(f"set {seed}", documents, rules, seed, [relations.is_what_the_files_say, relations.formats_agree])
+
+    def given(self):
+        """The inventories of the command line."""
+        documents = [(f"{number}-{path.name}", path.read_bytes()) for number, path in enumerate(self.arguments.inventories)]
+        rules = self.arguments.rules.read_bytes() if self.arguments.rules else None
+        chosen = None if self.arguments.only else [relations.is_what_the_files_say]
+        self.case("these inventories", documents, rules, self.arguments.seed, chosen)
+
+
+FILES = [
+    (["data/examples/bookworm.xml", "data/examples/bookworm-updates.xml.xz", "data/examples/trixie.xml.xz"], "data/examples/rules.xml"),
+    (["tests/data/typepair/A.xml", "tests/data/typepair/B.xml"], None),
+    (["tests/data/interchange-pywbem/04-all-in-one.xml", "tests/data/interchange-pywbem/05-withname.xml"], None),
+    (["tests/data/interchange-openpegasus/root_tstdev/inventory.xml", "tests/data/interchange-pywbem/04-all-in-one.xml"], None),
+]
+
+
+def kind_of(fault):
+    """What must stay the same while documents shrink: the beginning of the text, and its end if cimdelta refused."""
+    words = fault.split()
+    return " ".join(words[:4] + (words[-5:] if words[0] == "refused:" else []))
+
+
+def main():
+    parser = argparse.ArgumentParser(description="Relations between runs of cimdelta")
+    parser.add_argument("part", choices=["random", "rules", "files", "sets", "compare"])
+    parser.add_argument("inventories", nargs="*", type=pathlib.Path)
+    parser.add_argument("--program", required=True, type=pathlib.Path)
+    parser.add_argument("--root", required=True, type=pathlib.Path)
+    parser.add_argument("--sets", help="the program write_random_sets")
+    parser.add_argument("--rules", type=pathlib.Path)
+    parser.add_argument("--seed", type=int, default=FIRST_SEED)
+    parser.add_argument("--count", type=int)
+    parser.add_argument("--features", type=lambda text: tuple(text.split(",")), default=MAY_OCCUR)
+    parser.add_argument("--only", help="one relation by its name")
+    parser.add_argument("--keep", default=pathlib.Path(tempfile.gettempdir()) / "cimdelta-metamorphic", help="where failing documents are kept")
+    arguments = parser.parse_args()
+    arguments.count = arguments.count or COUNTS.get(arguments.part, 1)
+    arguments.program, arguments.root = arguments.program.resolve(), arguments.root.resolve()
+    with tempfile.TemporaryDirectory(prefix="cimdelta-metamorphic-") as scratch:
+        runner = Runner(arguments, scratch)
+        parts = {
+            "random": lambda: runner.random_inventories(False),
+            "rules": lambda: runner.random_inventories(True),
+            "files": runner.files,
+            "sets": runner.sets,
+            "compare": runner.given,
+        }
+        parts[arguments.part]()
+    if not runner.cases or not runner.run.runs:
+        sys.exit("no case was run")
+    print(f"{arguments.part}: {runner.cases} cases, {runner.run.runs} runs of cimdelta, {runner.failures} relations that do not hold")
+    return 1 if runner.failures else 0
+
+
+if __name__ == "__main__":
+    sys.exit(main())
