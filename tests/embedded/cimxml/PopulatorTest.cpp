@@ -69,14 +69,6 @@ TEST_F(PopulatorTest, ReferencesIntoTheOwnNamespaceAreStoredWithoutIt)
         {"plain", InstanceName("A", "x"), "A.Id=\"x\""},
         {"own", "<LOCALINSTANCEPATH>" + LocalNamespace("ROOT", "here") + InstanceName("A", "x") + "</LOCALINSTANCEPATH>",
          "A.Id=\"x\""},
-        {"slash", "<LOCALINSTANCEPATH>" + LocalNamespace("/root", "here/") + InstanceName("A", "x") + "</LOCALINSTANCEPATH>",
-         "A.Id=\"x\""},
-        {"whole", "<LOCALINSTANCEPATH>" + LocalNamespace("/", "/root/here") + InstanceName("A", "x") + "</LOCALINSTANCEPATH>",
-         "A.Id=\"x\""},
-        {"letter case",
-         "<INSTANCEPATH><NAMESPACEPATH><HOST>H</HOST>" + LocalNamespace("Root", "HERE") + "</NAMESPACEPATH>" +
-             InstanceName("A", "x") + "</INSTANCEPATH>",
-         "A.Id=\"x\""},
         {"own host",
          "<INSTANCEPATH><NAMESPACEPATH><HOST>h</HOST>" + LocalNamespace("root", "here") + "</NAMESPACEPATH>" +
              InstanceName("A", "x") + "</INSTANCEPATH>",
@@ -103,6 +95,23 @@ TEST_F(PopulatorTest, ReferencesIntoTheOwnNamespaceAreStoredWithoutIt)
     for (const auto& row : rows) {
         EXPECT_EQ(row.stored, fLoading.ValueOf("A.Id=\"" + std::string(row.id) + "\"", "R")) << row.id;
     }
+}
+
+TEST_F(PopulatorTest, TheOwnNamespaceIsKnownInAnyLetterCaseAndWithSlashes)
+{
+    const auto pathIn = [](const std::string& place) {
+        return Reference("<INSTANCEPATH><NAMESPACEPATH><HOST>H</HOST>" + place + "</NAMESPACEPATH>" + InstanceName("A", "x") +
+                         "</INSTANCEPATH>");
+    };
+    fLoading.Load(L::Group("<NAMESPACEPATH><HOST>h</HOST>" + LocalNamespace("/root", "here") + "</NAMESPACEPATH>" +
+                           L::Class("A", kReferenceR) + L::Instance("A", "letter case", pathIn(LocalNamespace("Root", "HERE"))) +
+                           L::Instance("A", "slashes", pathIn(LocalNamespace("/root/", "/here/"))) +
+                           L::Instance("A", "one element", pathIn(LocalNamespace("/", "/root/here"))) +
+                           L::Instance("A", "other", pathIn(LocalNamespace("root", "here2")))));
+    for (const char* const id : {"letter case", "slashes", "one element"}) {
+        EXPECT_EQ("A.Id=\"x\"", fLoading.ValueOf("A.Id=\"" + std::string(id) + "\"", "R")) << id;
+    }
+    EXPECT_EQ("//H/root/here2:A.Id=\"x\"", fLoading.ValueOf("A.Id=\"other\"", "R"));
 }
 
 TEST_F(PopulatorTest, ReferencesWrittenAsTextAreStoredLikeAllOthers)

@@ -78,12 +78,10 @@ TCIMValue MethodOf(const char* className, const char* qualifier, const std::vect
     return TCIMValue(boost::shared_ptr<const TEmbeddedObject>(object));
 }
 
-/// Keys that are equal in each row, written in different ways, and that differ from those of all other rows.
-std::vector<std::vector<TCIMValue>> GetRows()
+using TRows = std::vector<std::vector<TCIMValue>>;
+
+TRows GetTextRows()
 {
-    const double nan = std::numeric_limits<double>::quiet_NaN();
-    const float narrowNan = std::numeric_limits<float>::quiet_NaN();
-    const double infinity = std::numeric_limits<double>::infinity();
     return {
         {TCIMValue(), TCIMValue::Null(TType::kString), TCIMValue::Null(TType::kDateTime)},
         {TCIMValue("a"), TCIMValue(std::string("a"))},
@@ -97,6 +95,20 @@ std::vector<std::vector<TCIMValue>> GetRows()
         {TCIMValue("20240229120000.000000+060")},
         {TCIMValue(true), TCIMValue(true)},
         {TCIMValue(false)},
+        {TCIMValue(u'x'), TCIMValue(u'x')},
+        {TCIMValue(u'X')},
+        {TCIMValue(u'\0')},
+        {TCIMValue(u'\xD800')},
+        {TCIMValue(u'\xFFFD')},
+    };
+}
+
+TRows GetNumberRows()
+{
+    const double nan = std::numeric_limits<double>::quiet_NaN();
+    const float narrowNan = std::numeric_limits<float>::quiet_NaN();
+    const double infinity = std::numeric_limits<double>::infinity();
+    return {
         {TCIMValue(static_cast<unsigned char>(255)), TCIMValue(static_cast<unsigned char>(255))},
         {TCIMValue(static_cast<unsigned char>(0))},
         {TCIMValue(static_cast<signed char>(-128)), TCIMValue(static_cast<signed char>(-128))},
@@ -123,11 +135,12 @@ std::vector<std::vector<TCIMValue>> GetRows()
         {TCIMValue(-infinity)},
         {TCIMValue(0.1), TCIMValue(0.1)},
         {TCIMValue(std::nextafter(0.1, 1.0))},
-        {TCIMValue(u'x'), TCIMValue(u'x')},
-        {TCIMValue(u'X')},
-        {TCIMValue(u'\0')},
-        {TCIMValue(u'\xD800')},
-        {TCIMValue(u'\xFFFD')},
+    };
+}
+
+TRows GetMomentRows()
+{
+    return {
         {Moment("20240229120000.000000+060"), Moment("20240229110000.000000+000"), Moment("20240229033000.000000-450")},
         {Moment("20240229120000.000000+000"), Moment("20240229120000.000000-000"), Moment("20240301000000.000000+720")},
         {Moment("20240229120000.000001+000")},
@@ -148,6 +161,12 @@ std::vector<std::vector<TCIMValue>> GetRows()
         {Moment("00000001000000.00000*:000")},
         {Moment("********000000.000000:000")},
         {Moment("00000000000000.000000:000")},
+    };
+}
+
+TRows GetPathRows()
+{
+    return {
         {PathTo("Disk.Id=\"sda\",Bay=1"), PathTo("/Disk.Bay=1,Id=\"sda\""), PathTo("Disk.Bay=1.0,Id=\"sda\"")},
         {PathTo("root/cimv2:Disk.Bay=1,Id=\"sda\""), PathTo("/ROOT/CIMv2:Disk.Bay=1,Id=\"sda\"")},
         {PathTo("//web01/root/cimv2:Disk.Id=\"sda\""), PathTo("//WEB01/Root/cimv2:Disk.Id=\"sda\"")},
@@ -156,6 +175,12 @@ std::vector<std::vector<TCIMValue>> GetRows()
         {PathTo("Part.On=\"root/a:Disk.Id=1\"")},
         {EventAt("20240229120000.000000+060"), EventAt("20240229110000.000000+000")},
         {EventAt("20240229120000.000000+000")},
+    };
+}
+
+TRows GetObjectRows()
+{
+    return {
         {Embedded("Setting", {Member("Size", TCIMValue(1)), Member("Name", TCIMValue("a"))}),
          Embedded("SETTING", {Member("name", TCIMValue("a"), "Base"), Member("SIZE", TCIMValue(1))}),
          Embedded("Setting", {Member("Name", TCIMValue("a")), Member("Gone", TCIMValue()), Member("Size", TCIMValue(1))})},
@@ -167,6 +192,12 @@ std::vector<std::vector<TCIMValue>> GetRows()
         {Embedded("Setting", {Member("A", TCIMValue("<VALUE>&\"")), Member("B", TCIMValue("\x02"))})},
         {Embedded("Setting", {Member("A", TCIMValue("x</VALUE></PROPERTY><PROPERTY NAME=\"b\" TYPE=\"string\"><VALUE>y"))})},
         {Embedded("Setting", {Member("A", TCIMValue("x")), Member("B", TCIMValue("y"))})},
+    };
+}
+
+TRows GetNestedObjectRows()
+{
+    return {
         {Embedded("Setting", {Member("At", Moment("20240229120000.000000+060")), Member("Load", TCIMValue(-0.0))}),
          Embedded("Setting", {Member("Load", TCIMValue(0.0)), Member("At", Moment("20240229110000.000000+000"))})},
         {Embedded("Setting", {Member("In", Embedded("Inner", {Member("P", TCIMValue(1)), Member("Q", TCIMValue(2))}))}),
@@ -182,6 +213,17 @@ std::vector<std::vector<TCIMValue>> GetRows()
         {MethodOf("C", "Version", {"P", "Q"}), MethodOf("c", "VERSION", {"p", "q"})},
         {MethodOf("C", "Version", {"Q", "P"})},
     };
+}
+
+/// Keys that are equal in each row, written in different ways, and that differ from those of all other rows.
+TRows GetRows()
+{
+    TRows rows;
+    for (const TRows& some :
+         {GetTextRows(), GetNumberRows(), GetMomentRows(), GetPathRows(), GetObjectRows(), GetNestedObjectRows()}) {
+        rows.insert(rows.end(), some.begin(), some.end());
+    }
+    return rows;
 }
 
 TEST(KeyIdentityTest, KeysAreEqualByValueIfAndOnlyIfTheirTextsAre)
