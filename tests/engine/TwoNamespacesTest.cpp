@@ -1,3 +1,4 @@
+#include "host/TZELException.h"
 #include "tests/engine/TPerClassFixture.h"
 #include "tests/support/plain/TPlainInstance.h"
 #include "tests/support/plain/TPlainProperty.h"
