@@ -1,13 +1,19 @@
 #include <gtest/gtest.h>
 #include <unistd.h>
 
+#include <algorithm>
 #include <cstdio>
+#include <fstream>
+#include <string>
+#include <vector>
 
 #include "embedded/services/TSpdLogger.h"
 #include "tests/faults/FailEachAllocation.h"
 
 namespace NORVZEL20 {
 namespace {
+
+const std::string kEntry(2000, 'x');
 
 /// Writes an entry that is too long for any buffer on the stack.
 class TLogEntry : public IFaultyAction {
@@ -17,7 +23,7 @@ class TLogEntry : public IFaultyAction {
 
   private:
     TSpdLogger fLogger;
-    std::string fEntry = std::string(2000, 'x') + "\n";
+    std::string fEntry = kEntry + "\n";
 };
 
 /// Redirects standard error to a file while this object lives.
@@ -33,15 +39,33 @@ class TStandardErrorAside {
         std::fclose(fFile);
     }
 
+    /// The lines written so far that have something of an entry.
+    std::vector<std::string> GetEntries() const
+    {
+        std::ifstream file("/proc/self/fd/" + std::to_string(fileno(fFile)));
+        std::vector<std::string> entries;
+        for (std::string line; std::getline(file, line);) {
+            if (line.find("xx") != std::string::npos) {
+                entries.push_back(line);
+            }
+        }
+        return entries;
+    }
+
   private:
     std::FILE* fFile = std::tmpfile();
     int fBefore;
 };
 
-TEST(LoggerOutOfMemory, LosesTheEntryAndNeverThrows)
+TEST(LoggerOutOfMemory, NeverThrowsAndWritesAnEntryWholeOrNot)
 {
     const TStandardErrorAside aside;
     EXPECT_EQ("", FailEachAllocation("Log", std::make_unique<TLogEntry>));
+    const std::vector<std::string> entries = aside.GetEntries();
+    EXPECT_GE(entries.size(), 3u) << "nothing fails in the first two and in the last attempt";
+    for (const std::string& entry : entries) {
+        EXPECT_EQ(kEntry, entry.substr(std::min(entry.find("xx"), entry.size())));
+    }
 }
 
 }  // namespace
