@@ -121,7 +121,8 @@ TEST_F(NothingComparedTest, IfItIsAllowedTheResultSaysSo)
         WithRules("", {"--allow-empty"}));
     WithRules("", {"--allow-empty", "-o", "json"});
     const nlohmann::json document = nlohmann::json::parse(fOut);
-    EXPECT_EQ("{\"changedInstances\":0,\"changedValues\":0,\"differences\":0,\"everythingCompared\":false,\"nothingCompared\":true,"
+    EXPECT_EQ("{\"changedInstances\":0,\"changedValues\":0,\"differences\":0,\"everythingCompared\":false,"
+              "\"instancesOnlyInOthers\":0,\"nothingCompared\":true,"
               "\"onlyInOthers\":0,\"onlyInReference\":0}",
               document["summary"].dump());
     EXPECT_EQ("reachedByNoElement", document["coverage"]["classes"][0]["state"]);

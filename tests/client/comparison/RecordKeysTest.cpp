@@ -35,7 +35,7 @@ TEST_F(RecordKeysTest, ExcludingThemIsRefusedForEachOfTheThreeClasses)
 TEST_F(RecordKeysTest, WithAllTheirKeysOrUncomparedTheyDoNotMatter)
 {
     EXPECT_EQ("13", Compare("KALMO_Delta' default='include'"));
-    EXPECT_EQ("No",
+    EXPECT_EQ("2",
               Compare("KALMO_Delta' default='exclude' excludekeys='DeltaID'/><class name='KALMO_DeltaClass' default='include'"));
 }
 

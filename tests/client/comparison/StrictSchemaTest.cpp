@@ -115,7 +115,7 @@ TEST_F(StrictSchemaTest, AKeyThatHasNoPathIsNamed)
     part->SetSlot(0, TCIMValue(path));
     part->AddToNamespace(TCallContext());
     try {
-        TComparison(inventories, console).Run("", true);
+        TComparison(inventories, console).Run(std::nullopt, true);
         FAIL() << "the run did not end";
     } catch (const TClientError& error) {
         EXPECT_EQ(
