@@ -13,10 +13,12 @@
 // Numbers with slashes between them are those of the inventories, the reference first.
 #include "client/report/TextCoverage.h"
 
+#include <algorithm>
 #include <boost/algorithm/string/join.hpp>
 #include <map>
 #include <utility>
 
+#include "client/report/DisplayLabels.h"
 #include "client/rules/DescribeReducedReferences.h"
 #include "client/text/Counted.h"
 #include "client/text/DisplayText.h"
@@ -63,20 +65,26 @@ class TStatement {
                      "Not compared, because no element of the rules is for the class or one above it");
         WriteClasses(TCoverage::kNothingToCompare, "Not compared, because the class has no property to compare");
         WriteClasses(TCoverage::kUnknownToReference, "Not compared, because " + Label(0) + " does not declare the class");
-        WriteClasses(TCoverage::kOperatingSystemMade, "Not compared, because cimdelta made it");
+        WriteClasses(TCoverage::kOperatingSystemMade, "Not compared, because " + Makers());
         WriteMade();
+    }
+
+    // Of a class that is not compared since instances were made, "cimdelta made it" or, if some are real, which ones it made.
+    std::string Makers() const
+    {
+        const auto made = std::find_if(fCoverage.classes.begin(), fCoverage.classes.end(), [](const TCoverage::TClass& cls) {
+            return cls.state == TCoverage::kOperatingSystemMade && cls.HasOwnInstances();
+        });
+        return made == fCoverage.classes.end() ? "cimdelta made it"
+                                               : "cimdelta made the instance of " + DisplayLabels(fReport, made->madeIn);
     }
 
     // An operating system that is compared, but not in the inventories that have none of their own.
     void WriteMade()
     {
         for (const TCoverage::TClass& cls : fCoverage.classes) {
-            std::vector<std::string> labels;
-            for (const std::size_t inventory : cls.madeIn) {
-                labels.push_back(Label(inventory));
-            }
-            if (cls.state == TCoverage::kCompared && !labels.empty()) {
-                fOut += EscapeForDisplay(cls.name) + " not compared in " + boost::algorithm::join(labels, ", ") +
+            if (cls.state == TCoverage::kCompared && !cls.madeIn.empty()) {
+                fOut += EscapeForDisplay(cls.name) + " not compared in " + DisplayLabels(fReport, cls.madeIn) +
                         ", because cimdelta made the instance there.\n";
             }
         }

@@ -97,8 +97,7 @@ TEST_F(MadeSystemTest, WhereOnlyOneIsRealTheClassIsNotCompared)
         for (const std::vector<std::string>& options : {std::vector<std::string>{}, {"--spec", rules}}) {
             const std::string report = Report(inventories, options);
             EXPECT_EQ("Nothing was compared between", report.substr(0, 28));
-            EXPECT_NE(std::string::npos, report.find("\nNot compared, because cimdelta made it: KALMO_OperatingSystem (1 / 1"))
-                << report;
+            EXPECT_NE(std::string::npos, report.find("\nNot compared, because cimdelta made the instance of ")) << report;
             EXPECT_EQ(std::string::npos, report.find("Version")) << report;
         }
         const std::string records = Scratch("records.xml", Report(inventories, {"--spec", rules, "-o", "cimxml"}));
