@@ -94,13 +94,14 @@ TEST_F(MadeSystemTest, WhereOnlyOneIsRealTheClassIsNotCompared)
     const std::vector<std::vector<std::string>> sets{
         {fFirst, fThird}, {fThird, fFirst}, {fThird, fFirst, fSecond}, {fFirst, fThird, fThird}};
     for (const std::vector<std::string>& inventories : sets) {
-        for (const std::vector<std::string>& options : {std::vector<std::string>{}, {"--spec", rules}}) {
+        for (const std::vector<std::string>& options :
+             {std::vector<std::string>{"--allow-empty"}, {"--allow-empty", "--spec", rules}}) {
             const std::string report = Report(inventories, options);
             EXPECT_EQ("Nothing was compared between", report.substr(0, 28));
             EXPECT_NE(std::string::npos, report.find("\nNot compared, because cimdelta made the instance of ")) << report;
             EXPECT_EQ(std::string::npos, report.find("Version")) << report;
         }
-        const std::string records = Scratch("records.xml", Report(inventories, {"--spec", rules, "-o", "cimxml"}));
+        const std::string records = Scratch("records.xml", Report(inventories, {"--allow-empty", "--spec", rules, "-o", "cimxml"}));
         for (const std::string record : {"KALMO_Delta", "KALMO_DeltaClass", "KALMO_DeltaClassAssocToDelta"}) {
             EXPECT_EQ("", Result({"query", "-o", "ndjson", "SELECT * FROM " + record, records}));
         }
