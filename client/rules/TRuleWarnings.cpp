@@ -21,6 +21,7 @@
 #include "client/inventory/CollectObjects.h"
 #include "client/rules/DescribeReducedReferences.h"
 #include "client/rules/RecordClasses.h"
+#include "client/rules/ShowText.h"
 #include "client/text/SomeOf.h"
 #include "embedded/value/TNameText.h"
 
@@ -61,7 +62,7 @@ void TRuleWarnings::Check(std::size_t index)
     const TRulesDocument::TElement& element = fElements[index];
     if (const std::optional<std::size_t> complete = fTrace.GetArrival(index).complete) {
         Warn(index, element.line,
-             "this element for class " + element.className + " has no effect: the element at " + LineOf(*complete) +
+             "this element for class " + ShowName(element.className) + " has no effect: the element at " + LineOf(*complete) +
                  " completed the rules of the class; put what is meant into that one");
         return;
     }
@@ -84,14 +85,14 @@ void TRuleWarnings::CheckNames(std::size_t index, const ICIMClass& cls)
     const std::string& declared = cls.GetName(TCallContext());
     if (declared != element.className) {
         Warn(index, element.line,
-             "class " + element.className + " is declared as " + declared +
+             "class " + ShowName(element.className) + " is declared as " + declared +
                  "; letter case counts in rules, so this element does not apply to that class");
     }
     for (const TRulesDocument::TListed& listed : element.listed) {
         const std::string& name = cls.GetPropertyDecl(listed.property, TCallContext())->GetName(TCallContext());
         if (name != listed.property) {
             Warn(index, listed.line,
-                 "property " + listed.property + " of class " + element.className + " is declared as " + name +
+                 "property " + ShowName(listed.property) + " of class " + ShowName(element.className) + " is declared as " + name +
                      "; letter case counts in rules");
         }
     }
@@ -104,7 +105,7 @@ void TRuleWarnings::CheckRepetition(std::size_t index)
     for (const TRulesDocument::TListed& listed : element.listed) {
         if (++counts[listed.property] == 2) {
             Warn(index, listed.line,
-                 "property " + listed.property + " of class " + element.className +
+                 "property " + ShowName(listed.property) + " of class " + ShowName(element.className) +
                      " is already listed in this element; the first listing counts");
         }
     }
@@ -131,9 +132,9 @@ void TRuleWarnings::CheckKeys(std::size_t index, const boost::shared_ptr<ICIMCla
         const auto other =
             std::find_if(keys.begin(), keys.end(), [&key](const std::string& name) { return TNameText::Equal(name, key); });
         Warn(index, element.line,
-             other == keys.end() ? "excluded key " + key + " is not a key of class " + element.className
-                                 : "excluded key " + key + " of class " + element.className + " is declared as " + *other +
-                                       "; letter case counts in rules, so it still counts as a key");
+             other == keys.end() ? "excluded key " + ShowName(key) + " is not a key of class " + ShowName(element.className)
+                                 : "excluded key " + ShowName(key) + " of class " + ShowName(element.className) +
+                                       " is declared as " + *other + "; letter case counts in rules, so it still counts as a key");
     }
 }
 
@@ -145,13 +146,14 @@ void TRuleWarnings::WarnOfLateKeys(std::size_t index, std::size_t earlier)
     if (first.className == element.className) {
         reason = "the class has the keys of its first element, at " + LineOf(earlier) + "; name them there";
     } else {
-        reason = "the class already has the rules of its ancestor " + first.className + " (" + LineOf(earlier) + "); put " +
+        reason = "the class already has the rules of its ancestor " + ShowName(first.className) + " (" + LineOf(earlier) +
+                 "); put " +
                  (element.hasDefault || !element.listed.empty()
-                      ? "an element for " + element.className +
+                      ? "an element for " + ShowName(element.className) +
                             " with excludekeys alone before that one, and keep default and lists here"
                       : std::string("this element before that one"));
     }
-    Warn(index, element.line, "excludekeys of class " + element.className + " has no effect: " + reason);
+    Warn(index, element.line, "excludekeys of class " + ShowName(element.className) + " has no effect: " + reason);
 }
 
 void TRuleWarnings::CheckOverruled(std::size_t index)
@@ -163,11 +165,11 @@ void TRuleWarnings::CheckOverruled(std::size_t index)
         return;
     }
     Warn(index, element.line,
-         "the element for class " + element.className + " is read before that of its ancestor " + fElements[decider].className +
-             " (" + LineOf(decider) + "), whose default and lists replace its own; " +
+         "the element for class " + ShowName(element.className) + " is read before that of its ancestor " +
+             ShowName(fElements[decider].className) + " (" + LineOf(decider) + "), whose default and lists replace its own; " +
              (element.excludedKeys.empty() ? "put it after that one"
                                            : "keep excludekeys alone here, and put default and lists into a second element for " +
-                                                 element.className + " after that one"));
+                                                 ShowName(element.className) + " after that one"));
 }
 
 void TRuleWarnings::CheckDefault(std::size_t index)
@@ -185,7 +187,7 @@ void TRuleWarnings::CheckDefault(std::size_t index)
         }
     }
     Warn(index, element.line,
-         "class " + element.className +
+         "class " + ShowName(element.className) +
              " is not compared: this element has no default, which means exclude, and no list includes a "
              "property; write default=\"include\" or default=\"exclude\"");
 }

@@ -194,6 +194,13 @@ TEST_F(RuleWarningsTest, WithoutASchemaOnlyWhatHoldsForEverySchemaIsSaid)
                                      "<class name='N' excludekeys='k'/>", "<class name='N'/>"}));
 }
 
+TEST_F(RuleWarningsTest, LongNamesAreShortened)
+{
+    const std::string name(100, 'x');
+    EXPECT_EQ("1 excluded key " + name.substr(0, 80) + "... is not a key of class X\n",
+              Warnings({"<class name='X' default='include' excludekeys='" + name + "'/>"}));
+}
+
 TEST_F(RuleWarningsTest, OfVeryManyOnlyTheFirstAreSaid)
 {
     const auto said = [this](std::size_t count) {
