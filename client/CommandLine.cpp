@@ -1,8 +1,8 @@
 // Reading the command line with CLI11, and the one place that turns failures into an exit status.
 //
 // Each command has a record of its arguments, which CLI11 fills while it parses, and a callback, which only notes the function to
-// run. The command runs after parsing, so an exception of the command cannot be taken for a mistake in the arguments. Every failure
-// arrives in RunClient: it becomes one message and kExitTrouble (2).
+// run. The command runs after parsing, so an exception of the command cannot be taken for a mistake in the arguments. Before it
+// reads anything, its files are checked. Every failure arrives in RunClient: it becomes one message and kExitTrouble (2).
 
 #include "client/CommandLine.h"
 
@@ -16,6 +16,7 @@
 #include "client/commands/CheckCommand.h"
 #include "client/commands/CompareCommand.h"
 #include "client/commands/ExplainCommand.h"
+#include "client/commands/PrepareFiles.h"
 #include "client/commands/QueryCommand.h"
 #include "client/commands/ShowCommand.h"
 #include "client/process/ExitStatus.h"
@@ -152,8 +153,14 @@ class TCommandLine {
 
     void AddCompare()
     {
-        CLI::App* command = AddCommand("compare", "show what differs between a reference and other inventories",
-                                       [this](IConsole& console) { return RunCompare(fCompare, console); });
+        CLI::App* command =
+            AddCommand("compare", "show what differs between a reference and other inventories", [this](IConsole& console) {
+                std::vector<std::string> paths = fCompare.others;
+                paths.insert(paths.begin(), fCompare.reference);
+                paths = PrepareFiles({paths, fCompare.rules, fCompare.output}, 2, console);
+                fCompare.others.assign(paths.begin() + 1, paths.end());
+                return RunCompare(fCompare, console);
+            });
         AddText(command, "REFERENCE", fCompare.reference, kInventoryHelp)->required()->option_text(" ");
         AddText(command, "OTHER", fCompare.others, "the inventories to compare with the reference")->required()->option_text("...");
         AddText(command, "--spec", fCompare.rules,
@@ -168,7 +175,10 @@ class TCommandLine {
     void AddCheck()
     {
         CLI::App* command = AddCommand("check", "show what a rules file says, what follows from it and what may be a mistake",
-                                       [this](IConsole& console) { return RunCheck(fCheck, console); });
+                                       [this](IConsole& console) {
+                                           fCheck.schemas = PrepareFiles({fCheck.schemas, fCheck.rules, fCheck.output}, 1, console);
+                                           return RunCheck(fCheck, console);
+                                       });
         AddText(command, "RULES", fCheck.rules, "the rules file, or - for standard input")->required()->option_text(" ");
         AddSchemas(command, fCheck.schemas);
         AddStrictSchema(command, fCheck.strictSchema);
@@ -177,8 +187,11 @@ class TCommandLine {
 
     void AddExplain()
     {
-        CLI::App* command = AddCommand("explain", "show which rule decides how a class or a property is compared",
-                                       [this](IConsole& console) { return RunExplain(fExplain, console); });
+        CLI::App* command =
+            AddCommand("explain", "show which rule decides how a class or a property is compared", [this](IConsole& console) {
+                fExplain.schemas = PrepareFiles({fExplain.schemas, fExplain.rules, fExplain.output}, 1, console);
+                return RunExplain(fExplain, console);
+            });
         AddText(command, "ELEMENT", fExplain.element, "CLASS or CLASS.PROPERTY")->required()->option_text(" ");
         AddText(command, "--spec", fExplain.rules, "a rules file, or - for standard input (default: everything is compared)")
             ->option_text("RULES");
@@ -189,8 +202,10 @@ class TCommandLine {
 
     void AddQuery()
     {
-        CLI::App* command = AddCommand("query", "show the instances of an inventory that match a query",
-                                       [this](IConsole& console) { return RunQuery(fQuery, console); });
+        CLI::App* command = AddCommand("query", "show the instances of an inventory that match a query", [this](IConsole& console) {
+            PrepareFiles({{fQuery.inventory}, std::string(), fQuery.output}, 1, console);
+            return RunQuery(fQuery, console);
+        });
         AddText(command, "QUERY", fQuery.query, "WQL: SELECT * | name, ... FROM class [WHERE ...]")->required()->option_text(" ");
         AddText(command, "INVENTORY", fQuery.inventory, kInventoryHelp)->required()->option_text(" ");
         AddFormat(command, fQuery.format);
@@ -199,8 +214,11 @@ class TCommandLine {
 
     void AddShow()
     {
-        CLI::App* command = AddCommand("show", "show the classes of an inventory, or the instances of a class",
-                                       [this](IConsole& console) { return RunShow(fShow, console); });
+        CLI::App* command =
+            AddCommand("show", "show the classes of an inventory, or the instances of a class", [this](IConsole& console) {
+                PrepareFiles({{fShow.inventory}, std::string(), fShow.output}, 1, console);
+                return RunShow(fShow, console);
+            });
         AddText(command, "INVENTORY", fShow.inventory, kInventoryHelp)->required()->option_text(" ");
         AddText(command, "CLASS", fShow.className, "show the instances of this class and of the classes below it")
             ->option_text(" ");

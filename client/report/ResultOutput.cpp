@@ -18,6 +18,7 @@
 #include <charconv>
 #include <optional>
 
+#include "client/files/TFileIdentity.h"
 #include "client/files/TUnfinishedFile.h"
 #include "client/process/SystemError.h"
 #include "client/process/TClientError.h"
@@ -50,7 +51,7 @@ std::optional<int> NumberOf(std::string_view text)
     return read.ec == std::errc() ? std::optional<int>(number) : std::nullopt;
 }
 
-// The descriptor of this process that a link such as /proc/self/fd/1 stands for, if it is one of those links.
+// The descriptor of this process that a path such as /proc/self/fd/1 stands for, open or not, if it is one of those paths.
 std::optional<int> DescriptorNamed(const std::string& path)
 {
     const std::string folder = RealPath("/proc/self/fd");
@@ -63,7 +64,7 @@ std::optional<int> DescriptorNamed(const std::string& path)
 // The end of a path.
 struct TTarget {
     std::string path;               ///< at the end of all links, whether or not there is a file
-    std::optional<int> descriptor;  ///< the open descriptor that it stands for, if it does
+    std::optional<int> descriptor;  ///< the descriptor that it stands for, if it does
 };
 
 TTarget FollowLinks(const std::string& path)
@@ -71,12 +72,9 @@ TTarget FollowLinks(const std::string& path)
     TTarget target = {path, std::nullopt};
     char link[PATH_MAX];
     for (int links = 0; links < kMostLinks; ++links) {
-        const ssize_t length = readlink(target.path.c_str(), link, sizeof link);
-        if (length < 0) {
-            return target;
-        }
         target.descriptor = DescriptorNamed(target.path);
-        if (target.descriptor) {
+        const ssize_t length = readlink(target.path.c_str(), link, sizeof link);
+        if (target.descriptor || length < 0) {
             return target;
         }
         const std::string next(link, static_cast<std::size_t>(length));
@@ -146,11 +144,94 @@ void WriteTo(const std::string& path, const std::string& text)
     }
 }
 
+void CheckAccess(const std::string& path, int mode)
+{
+    ThrowIfFailed(faccessat(AT_FDCWD, path.c_str(), mode, AT_EACCESS));
+}
+
+// A new file needs a name that its folder takes, and the right to write to the folder.
+void CheckReplacement(const std::string& target)
+{
+    struct stat status;
+    if (stat(target.c_str(), &status) != 0 && errno != ENOENT) {
+        throw std::system_error(LastSystemError());
+    }
+    const std::string folder = FolderOf(target);
+    CheckAccess(folder.empty() ? "." : folder, W_OK | X_OK);
+}
+
+void CheckDescriptor(int descriptor)
+{
+    const int flags = fcntl(descriptor, F_GETFL);
+    ThrowIfFailed(flags);
+    if ((flags & O_ACCMODE) == O_RDONLY) {
+        throw std::system_error(EBADF, std::generic_category());
+    }
+}
+
+void CheckSpecial(const std::string& path)
+{
+    struct stat status;
+    if (stat(path.c_str(), &status) == 0 && S_ISDIR(status.st_mode)) {
+        throw std::system_error(EISDIR, std::generic_category());
+    }
+    CheckAccess(path, W_OK);
+}
+
+void CheckTarget(const std::string& path)
+{
+    const TTarget target = FollowLinks(path);
+    if (target.descriptor) {
+        CheckDescriptor(*target.descriptor);
+    } else if (IsSpecial(path)) {
+        CheckSpecial(path);
+    } else {
+        CheckReplacement(target.path);
+    }
+}
+
+// A device, such as /dev/null, or a terminal can be read and written.
+void CheckNotRead(const std::string& path, const std::vector<std::string>& inputs)
+{
+    const std::optional<TFileIdentity> output = IdentifyFile(path);
+    if (!output || IsSpecial(path)) {
+        return;
+    }
+    for (const std::string& input : inputs) {
+        const std::optional<TFileIdentity> identity = IdentifyFile(input);
+        if (identity && *identity == *output) {
+            throw TClientError(path + ": is one of the files that are read; name another file for the result");
+        }
+    }
+}
+
+// What a failed call says about the result.
+[[noreturn]] void RefuseToWrite(const std::string& path, const std::system_error& error)
+{
+    if (error.code() == std::errc::broken_pipe) {
+        throw TReaderGone();
+    }
+    throw TClientError(path + ": cannot be written", error.code());
+}
+
 }  // namespace
 
 bool IsStandardOutput(const std::string& path)
 {
     return path.empty() || path == "-";
+}
+
+void CheckOutput(const std::string& path, const std::vector<std::string>& inputs)
+{
+    if (IsStandardOutput(path)) {
+        return;
+    }
+    try {
+        CheckTarget(path);
+        CheckNotRead(path, inputs);
+    } catch (const std::system_error& error) {
+        RefuseToWrite(path, error);
+    }
 }
 
 void DeliverResult(IConsole& console, const std::string& path, const std::string& text)
@@ -162,10 +243,7 @@ void DeliverResult(IConsole& console, const std::string& path, const std::string
     try {
         WriteTo(path, text);
     } catch (const std::system_error& error) {
-        if (error.code() == std::errc::broken_pipe) {
-            throw TReaderGone();
-        }
-        throw TClientError(path + ": cannot be written", error.code());
+        RefuseToWrite(path, error);
     }
 }
 

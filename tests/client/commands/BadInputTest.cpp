@@ -107,10 +107,10 @@ TEST_F(BadInputTest, RulesThatCannotBeReadAreTheOnlyMessage)
     // Nothing is said of the inventories either, which lack an operating system.
     EXPECT_EQ("cimdelta: none.xml: cannot be opened: No such file or directory; name a rules file that can be read, or - for "
               "standard input\n",
-              Complaint({"compare", "--spec", "none.xml", "other-schema.xml", "missing.xml"}));
+              Complaint({"compare", "--spec", "none.xml", "other-schema.xml", "rules.xml"}));
     const std::string rules = Scratch("malformed", "<DifftoolSpec>");
     for (const std::vector<std::string>& command :
-         {std::vector<std::string>{"compare", "--spec", rules, "other-schema.xml", "other-schema.xml"},
+         {std::vector<std::string>{"compare", "--spec", rules, "other-schema.xml", "web01.xml"},
           std::vector<std::string>{"check", rules, "--schema", "other-schema.xml"},
           std::vector<std::string>{"explain", "INV_Extra", "--spec", rules, "--schema", "other-schema.xml"}}) {
         EXPECT_EQ("cimdelta: R:1: no element found; correct the file\n", Shorten(Complaint(command), rules, "R"));
@@ -152,11 +152,26 @@ TEST_F(BadInputTest, InventoriesThatCannotBeOpenedAreNamed)
               Complaint({"compare", "web01.xml", "."}));
 }
 
-TEST_F(BadInputTest, OfSeveralBadInventoriesTheFirstIsReported)
+TEST_F(BadInputTest, AllInventoriesThatCannotBeReadAreNamed)
 {
+    EXPECT_EQ("cimdelta: none.xml: cannot be opened: No such file or directory; 2 more cannot be read: ., b.xml\n",
+              Complaint({"compare", "web01.xml", "none.xml", ".", "web02.xml", "b.xml"}));
+    std::vector<std::string> compare(1, "compare");
+    for (int i = 0; i < 15; ++i) {
+        compare.push_back("none" + std::to_string(i));
+    }
+    EXPECT_EQ(
+        "cimdelta: none0: cannot be opened: No such file or directory; 14 more cannot be read: none1, none2, none3, none4, none5, "
+        "none6, none7, none8, none9, none10, none11, none12 and 2 more\n",
+        Complaint(compare));
+}
+
+TEST_F(BadInputTest, OfSeveralInventoriesThatCannotBeLoadedTheFirstIsReported)
+{
+    const std::string first = Scratch("first.xml", "<CIM>\n<SURPRISE/></CIM>");
+    const std::string second = Scratch("second.xml", "no XML");
     for (int i = 0; i < 20; ++i) {
-        EXPECT_EQ("cimdelta: none.xml: cannot be opened: No such file or directory\n",
-                  Complaint({"compare", "web01.xml", "none.xml", ".", "web02.xml"}));
+        EXPECT_EQ(0u, Complaint({"compare", "web01.xml", first, second, "web02.xml"}).find("cimdelta: " + first + ":2:1: "));
     }
 }
 

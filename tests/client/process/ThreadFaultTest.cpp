@@ -27,13 +27,15 @@ TEST_F(ThreadFaultTest, TheThreadsThatThereAreDoTheWork)
     const std::vector<std::string> compare = {"compare",   "web01.xml",       "web02.xml.gz",
                                               "web03.xml", "web01-again.xml", "two-boots.xml"};
     const std::string expected = Result(compare);
+    const std::string bad = Scratch("bad.xml", "no XML");
+    const std::string worse = Scratch("worse.xml", "");
     for (const int left : {0, 1, 2, 3}) {
         gLeft = left;
         EXPECT_EQ(expected, Result(compare)) << left;
         EXPECT_EQ(0, gLeft) << "threads are requested";
         gLeft = left;
-        EXPECT_EQ("cimdelta: none.xml: cannot be opened: No such file or directory\n",
-                  Complaint({"compare", "web01.xml", "none.xml", ".", "web02.xml"}));
+        EXPECT_EQ("cimdelta: B:1:1: found malformed XML: syntax error\n",
+                  Shorten(Complaint({"compare", "web01.xml", bad, worse, "web02.xml"}), bad, "B"));
     }
 }
 
