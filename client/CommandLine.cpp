@@ -3,6 +3,9 @@
 // Each command has a record of its arguments, which CLI11 fills while it parses, and a callback, which only notes the function to
 // run. The command runs after parsing, so an exception of the command cannot be taken for a mistake in the arguments. Before it
 // reads anything, its files are checked. Every failure arrives in RunClient: it becomes one message and kExitTrouble (2).
+//
+// CLI11 reports a misspelt option as one argument too many, or as the lack of another one that is required. So whatever it reports,
+// the arguments that it did not take are searched for an unknown option first.
 
 #include "client/CommandLine.h"
 
@@ -23,6 +26,7 @@
 #include "client/process/LackOfMemory.h"
 #include "client/process/TReaderGone.h"
 #include "client/report/OutputFormats.h"
+#include "client/text/NearestWord.h"
 
 namespace NORVZEL20 {
 
@@ -53,6 +57,33 @@ std::string Alternatives(std::vector<std::string> names)
     return boost::algorithm::join(names, ", ") + " or " + last;
 }
 
+bool IsOption(const std::string& argument)
+{
+    return argument.size() > 1 && argument.front() == '-' && argument != "--";
+}
+
+// The first option among the arguments that the command did not take, without a value behind "="; empty if there is none.
+std::string UnknownOption(const CLI::App& command)
+{
+    for (const std::string& argument : command.remaining()) {
+        if (IsOption(argument)) {
+            return Unguard(argument.substr(0, argument.find('=')));
+        }
+    }
+    return std::string();
+}
+
+std::vector<std::string> LongOptions(const CLI::App& command)
+{
+    std::vector<std::string> names;
+    for (const CLI::Option* option : command.get_options()) {
+        for (const std::string& name : option->get_lnames()) {
+            names.push_back("--" + name);
+        }
+    }
+    return names;
+}
+
 std::string RefuseEmpty(const std::string& text)
 {
     return text.empty() ? "must not be empty" : "";
@@ -63,10 +94,10 @@ class TCommandLine {
   public:
     TCommandLine()
     {
-        fApp.set_version_flag("--version", std::string("cimdelta ") + CIMDELTA_VERSION);
+        AddVersion(fApp);
         fApp.require_subcommand(1);
         fApp.footer("Exit status: 0 for success (compare: no differences), 1 for differences, 2 for trouble.\n"
-                    "cimdelta COMMAND --help describes one command.");
+                    "cimdelta help COMMAND describes one command.");
         AddCompare();
         AddCheck();
         AddExplain();
@@ -76,12 +107,18 @@ class TCommandLine {
 
     int Run(int argc, const char* const* argv, IConsole& console)
     {
-        std::vector<std::string> guarded;
-        for (int i = argc - 1; i > 0; --i) {
-            guarded.push_back(Guard(argv[i]));
+        std::vector<std::string> arguments(argv + 1, argv + argc);
+        if (!arguments.empty() && arguments.front() == "help") {
+            arguments = HelpAsOption(arguments);
         }
+        const std::string wrong = arguments.empty() ? std::string() : WrongCommand(arguments.front());
+        if (!wrong.empty()) {
+            return Refuse(wrong, console);
+        }
+        std::transform(arguments.begin(), arguments.end(), arguments.begin(), &Guard);
+        std::reverse(arguments.begin(), arguments.end());  // CLI11 wants the last argument first
         try {
-            fApp.parse(std::move(guarded));  // CLI11 wants the last argument first
+            fApp.parse(std::move(arguments));
         } catch (const CLI::ParseError& error) {
             return Answer(error, console);
         }
@@ -89,6 +126,60 @@ class TCommandLine {
     }
 
   private:
+    static int Refuse(const std::string& message, IConsole& console)
+    {
+        console.Say("cimdelta: " + message);
+        return kExitTrouble;
+    }
+
+    static void AddVersion(CLI::App& app) { app.set_version_flag("--version", std::string("cimdelta ") + CIMDELTA_VERSION); }
+
+    // "help" is "--help", and "help compare" is "compare --help".
+    static std::vector<std::string> HelpAsOption(const std::vector<std::string>& arguments)
+    {
+        const bool isGeneral = arguments.size() == 1 || arguments[1] == "help" || IsOption(arguments[1]);
+        return isGeneral ? std::vector<std::string>{"--help"} : std::vector<std::string>{arguments[1], "--help"};
+    }
+
+    std::vector<std::string> CommandNames() const
+    {
+        std::vector<std::string> names;
+        for (const CLI::App* command : fApp.get_subcommands([](const CLI::App*) { return true; })) {
+            names.push_back(command->get_name());
+        }
+        return names;
+    }
+
+    // What is wrong with the first argument if it is neither an option nor a command; empty if nothing is.
+    std::string WrongCommand(const std::string& first) const
+    {
+        const std::vector<std::string> names = CommandNames();
+        if (first.empty() || IsOption(first) || std::find(names.begin(), names.end(), first) != names.end()) {
+            return std::string();
+        }
+        const std::string nearest = NearestWord(first, names);
+        return first + " is no command; " +
+               (nearest.empty() ? "name one: " + Alternatives(names) + "; see cimdelta --help" : "did you mean " + nearest + "?");
+    }
+
+    // The message about an option that its command does not have; empty if there is none.
+    std::string WrongOption(const CLI::App& command) const
+    {
+        const std::string name = &command == &fApp ? "cimdelta" : "cimdelta " + command.get_name();
+        const std::string early = UnknownOption(fApp);
+        const std::vector<std::string> options = LongOptions(command);
+        if (&command != &fApp && std::find(options.begin(), options.end(), early) != options.end()) {
+            return early + " is an option of " + command.get_name() + "; put it behind the command: " + name + " " + early;
+        }
+        const std::string unknown = early.empty() ? UnknownOption(command) : early;
+        if (unknown.empty()) {
+            return std::string();
+        }
+        const std::string nearest = NearestWord(unknown, options);
+        return unknown + " is no option of " + name + "; " +
+               (nearest.empty() ? "see " + name + " --help" : "did you mean " + nearest + "?");
+    }
+
     // Ends a run without a command: --help and --version are results, everything else is wrong usage.
     int Answer(const CLI::ParseError& error, IConsole& console)
     {
@@ -99,17 +190,19 @@ class TCommandLine {
             return kExitSuccess;
         }
         const std::vector<CLI::App*> chosen = fApp.get_subcommands();
-        if (chosen.empty()) {
-            console.Say("cimdelta: name a command: compare, check, explain, query or show; see cimdelta --help");
-        } else {
-            console.Say("cimdelta: " + Unguard(error.what()) + "; see cimdelta " + chosen[0]->get_name() + " --help");
+        const std::string wrong = WrongOption(chosen.empty() ? fApp : *chosen[0]);
+        if (!wrong.empty()) {
+            return Refuse(wrong, console);
         }
-        return kExitTrouble;
+        return Refuse(chosen.empty() ? "name a command: " + Alternatives(CommandNames()) + "; see cimdelta --help"
+                                     : Unguard(error.what()) + "; see cimdelta " + chosen[0]->get_name() + " --help",
+                      console);
     }
 
     CLI::App* AddCommand(const char* name, const char* description, std::function<int(IConsole&)> run)
     {
         CLI::App* command = fApp.add_subcommand(name, description);
+        AddVersion(*command);
         // The callback only notes the function, which runs when the whole command line has been accepted.
         command->callback([this, run] { fCommand = run; });
         return command;

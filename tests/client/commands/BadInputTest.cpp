@@ -236,16 +236,5 @@ TEST_F(BadInputTest, ALongKeyMakesNoLongMessage)
               Shorten(Complaint({"show", inventory}), inventory, "I"));
 }
 
-TEST_F(BadInputTest, WrongUsageIsReportedInOneLine)
-{
-    EXPECT_EQ("cimdelta: name a command: compare, check, explain, query or show; see cimdelta --help\n", Complaint({}));
-    EXPECT_EQ("cimdelta: OTHER is required; see cimdelta compare --help\n", Complaint({"compare", "web01.xml"}));
-    EXPECT_EQ("cimdelta: --schema is required; see cimdelta explain --help\n", Complaint({"explain", "INV_Disk"}));
-    EXPECT_EQ("cimdelta: --format: html not in {text,json,ndjson,cimxml}; see cimdelta compare --help\n",
-              Complaint({"compare", "-o", "html", "web01.xml", "web02.xml"}));
-    EXPECT_EQ("cimdelta: The following argument was not expected: --wrong; see cimdelta compare --help\n",
-              Complaint({"compare", "web01.xml", "web02.xml", "--wrong"}));
-}
-
 }  // namespace
 }  // namespace NORVZEL20

@@ -21,7 +21,8 @@ TEST_F(ExecutableTest, ResultsGoToStandardOutputAlone)
 TEST_F(ExecutableTest, TroubleGoesToStandardErrorAlone)
 {
     EXPECT_EQ("[2]\n--\ncimdelta: none.xml: cannot be opened: No such file or directory\n", Shell("compare web01.xml none.xml"));
-    EXPECT_EQ("[2]\n--\ncimdelta: name a command: compare, check, explain, query or show; see cimdelta --help\n", Shell("frob"));
+    EXPECT_EQ("[2]\n--\ncimdelta: frob is no command; name one: compare, check, explain, query or show; see cimdelta --help\n",
+              Shell("frob"));
 }
 
 TEST_F(ExecutableTest, MessagesMoveNoTerminal)

@@ -1,0 +1,70 @@
+#include "tests/client/TClientFixture.h"
+
+namespace NORVZEL20 {
+namespace {
+
+/// How cimdelta explains its use, and what it says about a command line that it does not understand.
+class UsageTest : public TClientFixture {};
+
+TEST_F(UsageTest, HelpIsACommandToo)
+{
+    const std::string general = Result({"--help"});
+    EXPECT_NE(std::string::npos, general.find("cimdelta help COMMAND describes one command.")) << general;
+    EXPECT_EQ(general, Result({"help"}));
+    EXPECT_EQ(general, Result({"help", "help"}));
+    EXPECT_EQ(general, Result({"help", "--help"}));
+    for (const char* const command : {"compare", "check", "explain", "query", "show"}) {
+        const std::string help = Result({command, "--help"});
+        EXPECT_NE(std::string::npos, help.find(std::string("Usage: cimdelta ") + command)) << help;
+        EXPECT_EQ(help, Result({"help", command}));
+        EXPECT_NE(general, help);
+    }
+}
+
+TEST_F(UsageTest, EachCommandKnowsTheVersion)
+{
+    const std::string version = Result({"--version"});
+    EXPECT_EQ("cimdelta ", version.substr(0, 9));
+    for (const char* const command : {"compare", "check", "explain", "query", "show"}) {
+        EXPECT_EQ(version, Result({command, "--version"}));
+    }
+}
+
+TEST_F(UsageTest, WrongUsageIsReportedInOneLine)
+{
+    const char kCommands[] = "compare, check, explain, query or show; see cimdelta --help";
+    const struct {
+        std::vector<std::string> arguments;
+        std::string message;
+    } rows[] = {
+        {{}, std::string("name a command: ") + kCommands},
+        {{""}, std::string("name a command: ") + kCommands},
+        {{"compar", "web01.xml", "web02.xml"}, "compar is no command; did you mean compare?"},
+        {{"compar", "--help"}, "compar is no command; did you mean compare?"},
+        {{"help", "shwo"}, "shwo is no command; did you mean show?"},
+        {{"help", "merge"}, std::string("merge is no command; name one: ") + kCommands},
+        {{"web01.xml", "web02.xml"}, std::string("web01.xml is no command; name one: ") + kCommands},
+        {{"--verson"}, "--verson is no option of cimdelta; did you mean --version?"},
+        {{"--spec", "rules.xml", "compare", "web01.xml", "web02.xml"},
+         "--spec is an option of compare; put it behind the command: cimdelta compare --spec"},
+        {{"explain", "INV_Disk"}, "--schema is required; see cimdelta explain --help"},
+        {{"compare", "web01.xml"}, "OTHER is required; see cimdelta compare --help"},
+        {{"compare", "--ouput", "report", "web01.xml", "web02.xml"},
+         "--ouput is no option of cimdelta compare; did you mean --output?"},
+        {{"compare", "--spek=rules.xml", "web01.xml", "web02.xml"},
+         "--spek is no option of cimdelta compare; did you mean --spec?"},
+        {{"explain", "A", "--schma", "web01.xml", "--spec", "rules.xml"},
+         "--schma is no option of cimdelta explain; did you mean --schema?"},
+        {{"compare", "web01.xml", "web02.xml", "--wrong"}, "--wrong is no option of cimdelta compare; see cimdelta compare --help"},
+        {{"compare", "-x", "web01.xml", "web02.xml"}, "-x is no option of cimdelta compare; see cimdelta compare --help"},
+        {{"show", "a", "b", "c"}, "The following argument was not expected: c; see cimdelta show --help"},
+        {{"compare", "-o", "html", "web01.xml", "web02.xml"},
+         "--format: html not in {text,json,ndjson,cimxml}; see cimdelta compare --help"},
+    };
+    for (const auto& row : rows) {
+        EXPECT_EQ("cimdelta: " + row.message + "\n", Complaint(row.arguments));
+    }
+}
+
+}  // namespace
+}  // namespace NORVZEL20
