@@ -20,6 +20,9 @@ namespace {
 int OpenFile(const std::string& path)
 {
     if (path == "-") {
+        if (IsClosed(STDIN_FILENO)) {
+            throw TClientError("standard input: cannot be read: it is closed");
+        }
         return STDIN_FILENO;
     }
     const int descriptor = open(path.c_str(), O_RDONLY | O_CLOEXEC);
@@ -86,8 +89,6 @@ std::size_t TInputFile::ReadDescriptor(char* buffer, std::size_t size)
             pollfd wait = {fDescriptor, POLLIN, 0};
             // Waits without using the processor; errors show at the next read().
             poll(&wait, 1, -1);
-        } else if (reason == std::errc::bad_file_descriptor && IsClosed(fDescriptor)) {
-            throw TClientError(fName + ": cannot be read: it is closed");
         } else if (reason != std::errc::interrupted) {
             throw TClientError(fName + ": cannot be read", reason);
         }

@@ -10,7 +10,8 @@ namespace NORVZEL20 {
 /// The bytes of a file, or of standard input, as they are.
 class TInputFile : public IByteSource {
   public:
-    /// Opens the file, or standard input for "-". Errors: TClientError if it cannot be opened or is a directory.
+    /// Opens the file, or standard input for "-". Errors: TClientError if it cannot be opened, is a directory or is a standard
+    /// input that is closed.
     explicit TInputFile(const std::string& path);
     TInputFile(const TInputFile&) = delete;
     TInputFile& operator=(const TInputFile&) = delete;

@@ -2,6 +2,7 @@
 
 #include <sys/stat.h>
 
+#include "client/files/TInputFile.h"
 #include "client/inventory/TInventoryFile.h"
 #include "client/process/TClientError.h"
 #include "client/text/SomeOf.h"
@@ -10,11 +11,18 @@ namespace NORVZEL20 {
 
 namespace {
 
-// Opening a pipe may wait for a writer, and closing it ends the writer.
-bool IsToBeLeftAlone(const std::string& path)
+void CheckFile(const std::string& path)
 {
+    if (path == "-") {
+        const TInputFile file(path);
+        return;
+    }
     struct stat status;
-    return path == "-" || (stat(path.c_str(), &status) == 0 && !S_ISREG(status.st_mode) && !S_ISDIR(status.st_mode));
+    if (stat(path.c_str(), &status) == 0 && !S_ISREG(status.st_mode) && !S_ISDIR(status.st_mode)) {
+        // Opening a pipe may wait for a writer, and closing it ends the writer.
+        return;
+    }
+    const TInventoryFile file(path);
 }
 
 }  // namespace
@@ -24,11 +32,8 @@ void CheckInventoryFiles(const std::vector<std::string>& paths)
     std::string message;
     std::vector<std::string> others;
     for (const std::string& path : paths) {
-        if (IsToBeLeftAlone(path)) {
-            continue;
-        }
         try {
-            const TInventoryFile file(path);
+            CheckFile(path);
         } catch (const TClientError& error) {
             if (message.empty()) {
                 message = error.what();

@@ -5,10 +5,9 @@
 
 namespace NORVZEL20 {
 
-/// Opens each file and reads its first bytes, which takes no time, before the first of them is loaded, which may take long. Pipes,
-/// devices and standard input are left alone: what is read of them is gone.
-/// Errors: TClientError, that of TInventoryFile for the first file that cannot be read. The message ends with the names of the
-/// others.
+/// Opens each file and reads its first bytes, which takes no time, before the first of them is loaded, which may take long. Nothing
+/// is read of standard input, pipes and devices, because it could not be read again. Errors: TClientError, that of TInventoryFile
+/// for the first file that cannot be read. The message ends with the names of the others.
 void CheckInventoryFiles(const std::vector<std::string>& paths);
 
 }  // namespace NORVZEL20

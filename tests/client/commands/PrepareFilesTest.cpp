@@ -43,6 +43,7 @@ TEST_F(PrepareFilesTest, AMissingInventoryIsKnownBeforeOthersAreRead)
     std::ofstream(fFolder / "zip") << "PK\x03\x04";
     EXPECT_EQ("cimdelta: F/zip: is compressed with zip, which is not understood; gzip, xz and zstd are\n",
               Messages({"compare", fSlow, fFolder / "zip"}));
+    EXPECT_EQ("[2]\n--\ncimdelta: standard input: cannot be read: it is closed\n", Shell("compare " + fSlow + " - <&-"));
 }
 
 TEST_F(PrepareFilesTest, AnOutputThatCannotBeWrittenIsKnownBeforeInventoriesAreRead)
