@@ -80,7 +80,19 @@ TCIMValue ValueOf(const TNaiveValue& value)
     return simple;
 }
 
-void Build(const TNaiveNamespace& plain, TNamespaceBuilder& builder)
+std::string ListTextOf(const TNaiveElement& element, bool isIncluded)
+{
+    std::string text;
+    for (const auto& [name, included] : element.listed) {
+        text += included == isIncluded ? "<value>" + name + "</value>" : "";
+    }
+    const std::string tag = isIncluded ? "includelist" : "excludelist";
+    return text.empty() ? "" : "<" + tag + ">" + text + "</" + tag + ">";
+}
+
+}  // namespace
+
+void BuildNamespace(const TNaiveNamespace& plain, TNamespaceBuilder& builder)
 {
     for (const auto& cls : plain.classes) {
         std::vector<TNamespaceBuilder::TProperty> properties;
@@ -97,18 +109,6 @@ void Build(const TNaiveNamespace& plain, TNamespaceBuilder& builder)
         builder.Instance(instance.className, values);
     }
 }
-
-std::string ListTextOf(const TNaiveElement& element, bool isIncluded)
-{
-    std::string text;
-    for (const auto& [name, included] : element.listed) {
-        text += included == isIncluded ? "<value>" + name + "</value>" : "";
-    }
-    const std::string tag = isIncluded ? "includelist" : "excludelist";
-    return text.empty() ? "" : "<" + tag + ">" + text + "</" + tag + ">";
-}
-
-}  // namespace
 
 std::string RulesOf(const TNaiveSet& set)
 {
@@ -134,7 +134,7 @@ std::string CompareByPlugIn(const TNaiveSet& set, EHost host)
     TComparisonRun comparison(host);
     comparison.SetWithOperatingSystem(false);
     for (std::size_t index = 0; index < set.namespaces.size(); ++index) {
-        Build(set.namespaces[index], comparison.Namespace(index));
+        BuildNamespace(set.namespaces[index], comparison.Namespace(index));
     }
     comparison.Rules(RulesOf(set));
     const std::string status = comparison.Run();

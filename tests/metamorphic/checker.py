@@ -17,7 +17,6 @@ class Checker:
         self.schema = self.comparison.schema
         self.labels = [one["label"] for one in report["inventories"]]
         self.coverage = {one["class"].lower(): one for one in report["coverage"]["classes"]}
-        self.compares_everything = rules_data is None
 
     def faults(self):
         """What is wrong, one text each; empty if the report is right."""
@@ -50,62 +49,104 @@ class Checker:
 
     def coverage_faults(self):
         names = set(self.comparison.class_names())
-        made = {name for name, one in self.coverage.items() if one["state"] == "madeByCimdelta"}
-        for name in sorted(names ^ (self.coverage.keys() - made - {inventory.OPERATING_SYSTEM})):
-            if name != inventory.OPERATING_SYSTEM:
-                yield f"coverage: class {name} has instances in the files or in the coverage, but not in both"
+        if any(not count for count in self.comparison.count(inventory.OPERATING_SYSTEM)):
+            names.add(inventory.OPERATING_SYSTEM)  # one was made
+        for name in sorted(names ^ self.coverage.keys()):
+            yield f"coverage: class {name} has instances in the files or in the coverage, but not in both"
         for name in sorted(names & self.coverage.keys()):
             yield from self.class_faults(name, self.coverage[name])
+        empty = len(self.schema.classes.keys() - names)
+        if self.report["coverage"]["classesWithoutInstances"] != empty:
+            yield f"coverage: {empty} classes have no instances, not {self.report['coverage']['classesWithoutInstances']}"
         yield from self.completeness_faults(names)
 
+    def expected_state(self, name):
+        rules, properties = self.comparison.rules, self.comparison.properties(name)
+        if name == inventory.OPERATING_SYSTEM and not self.comparison.count(name)[0]:
+            return "madeByCimdelta"
+        if not rules.is_reached(name):
+            return "reachedByNoElement"
+        if rules.compared(name):
+            return "compared"
+        return "nothingToCompare" if set(properties) <= {"datetimeofcollection"} and rules.of(name).includes else "excludedByRules"
+
     def class_faults(self, name, covered):
-        compared = self.comparison.rules.compared(name)
-        is_compared = covered["state"] == "compared"
-        if is_compared != bool(compared) and name != inventory.OPERATING_SYSTEM:
-            yield f"coverage: {name} is {covered['state']}, but the rules compare {sorted(compared)}"
-        if name != inventory.OPERATING_SYSTEM and covered["instances"] != self.comparison.count(name):
-            yield f"coverage: {name} has {self.comparison.count(name)} instances, not {covered['instances']}"
-        if not is_compared:
+        yield from self.fault(name, "state", covered["state"], self.expected_state(name))
+        counts = self.comparison.count(name)
+        made = [label for label, count in zip(self.labels, counts) if not count and name == inventory.OPERATING_SYSTEM]
+        yield from self.fault(name, "madeIn", covered.get("madeIn", []), made)
+        yield from self.fault(name, "instances", covered["instances"], [max(count, label in made) for label, count in zip(self.labels, counts)])
+        if covered["state"] != "compared":
             return
-        left_out = {p.lower() for p in covered["propertiesLeftOut"]}
-        if left_out != set(self.comparison.properties(name)) - compared:
-            yield f"coverage: properties of {name} left out: {sorted(set(self.comparison.properties(name)) - compared)}, not {sorted(left_out)}"
-        keys = {lower for lower, p in self.comparison.properties(name).items() if p.is_key}
-        excluded = {k.lower() for k in self.comparison.rules.excluded_keys(name)} & keys
-        if {k.lower() for k in covered["excludedKeys"]} & keys != excluded:
-            yield f"coverage: excluded keys of {name}: {sorted(excluded)}, not {covered['excludedKeys']}"
-        sharing = self.comparison.sharing(name, excluded)
-        if name != inventory.OPERATING_SYSTEM and covered["sharingKeys"] != sharing:
-            yield f"coverage: instances of {name} that share a key: {sharing}, not {covered['sharingKeys']}"
+        properties = self.comparison.properties(name)
+        left_out = sorted(set(properties) - self.comparison.rules.compared(name))
+        yield from self.fault(name, "propertiesLeftOut", sorted(p.lower() for p in covered["propertiesLeftOut"]), left_out)
+        excluded = self.comparison.rules.excluded_keys(name)
+        ignored = {lower for lower, p in properties.items() if p.is_key and p.name in excluded}
+        yield from self.fault(name, "excludedKeys", sorted(covered["excludedKeys"]), sorted(excluded))
+        yield from self.fault(name, "ignoredKeys", sorted(k.lower() for k in covered["ignoredKeys"]), sorted(ignored))
+        yield from self.key_faults(name, covered, ignored)
+        is_reduced, keys = self.dropped_from_references(name, excluded)
+        if is_reduced and not covered["referencesReduced"] or keys - {k.lower() for k in covered["referenceKeysLeftOut"]}:
+            yield f"coverage: {name}: references differ in what was left out of them ({sorted(keys)}), and it is not said"
+
+    def key_faults(self, name, covered, ignored):
+        indexes = [self.comparison.by_key(index, name, ignored) for index in range(len(self.labels))]
+        shares = [sum(len(same) - 1 for same in index.values()) for index in indexes]
+        alone = [sum(len(same) - 1 for key, same in index.items() if key not in indexes[0]) for index in indexes]
+        took_part = [0, *self.comparison.positions(name)]
+        compared = [len(indexes[0])] + [sum(map(len, index.values())) for index in indexes[1:]]
+        compared = [count if index in took_part else 0 for index, count in enumerate(compared)]
+        yield from self.fault(name, "sharingKeys", covered["sharingKeys"], shares)
+        yield from self.fault(name, "sharingKeysWithoutPartner", covered["sharingKeysWithoutPartner"], alone)
+        yield from self.fault(name, "instancesCompared", covered["instancesCompared"], compared)
+
+    @staticmethod
+    def fault(name, field, said, right):
+        if said != right:
+            yield f"coverage: {name}: {field} is {said}, not {right}"
 
     def completeness_faults(self, names):
         """everythingCompared is a promise: nothing at all was left out."""
-        if not self.report["summary"]["everythingCompared"]:
-            return
+        left_out = []
         for name in sorted(names):
-            covered = self.coverage.get(name)
-            if covered is None or covered["state"] != "compared":
-                if name != inventory.OPERATING_SYSTEM or covered is None:
-                    yield f"coverage: everything was compared, but {name} was not"
-            elif covered["propertiesLeftOut"] or any(covered["sharingKeys"]):
-                yield f"coverage: everything was compared, but something of {name} was not"
-            elif self.dropped_from_references(name, covered):
-                yield f"coverage: everything was compared, but parts of references of {name} were not"
+            covered = self.coverage.get(name, {"state": "not mentioned"})
+            if covered["state"] == "madeByCimdelta" and not any(self.comparison.count(name)):
+                continue  # no inventory has one
+            if covered["state"] != "compared":
+                left_out.append(name)
+            elif covered["propertiesLeftOut"] or covered["sharingKeys"][0] or covered["referencesReduced"] or covered.get("madeIn"):
+                left_out.append(f"part of {name}")
+        is_complete = not left_out and not self.report["summary"]["nothingCompared"]
+        if self.report["summary"]["everythingCompared"] and not is_complete:
+            yield f"coverage: everything was compared, but not {left_out}"
+        if not self.report["summary"]["everythingCompared"] and is_complete and not any(any(c["sharingKeys"]) for c in self.coverage.values()):
+            yield "coverage: not everything was compared, but nothing is named"
+        compared = sum(sum(c.get("instancesCompared", [])) for c in self.coverage.values() if c["state"] == "compared")
+        if self.report["summary"]["nothingCompared"] != (compared == 0):
+            yield f"coverage: nothingCompared is {self.report['summary']['nothingCompared']}, but {compared} instances were compared"
 
-    def dropped_from_references(self, name, covered):
-        """Whether references of this class differ in the files and count as equal because keys are excluded."""
-        excluded, properties = covered["excludedKeys"], set(self.comparison.properties(name))
-        if not excluded:
-            return False
-        lower = {k.lower() for k in excluded}
-        for index in range(1, len(self.comparison.inventories)):
+    def dropped_from_references(self, name, excluded):
+        """Whether references of this class differ in the files and count as equal because keys are excluded; the keys that differ."""
+        lower = {key.lower() for key in excluded}
+        keys, is_reduced = set(), False
+        for index in self.comparison.positions(name) if excluded else ():
             reference = self.comparison.by_key(0, name, lower)
             for key, instances in self.comparison.by_key(index, name, lower).items():
-                for one in reference.get(key, [])[:1]:
-                    pairs = [(one.values.get(p), other.values.get(p)) for p in properties for other in instances]
-                    if any(a and b and a != b and a[0] == b[0] == "reference" and d.without_keys(a, excluded) == d.without_keys(b, excluded) for a, b in pairs):
-                        return True
-        return False
+                for left, right in self.references(reference.get(key, [])[:1], instances):
+                    if left != right and d.without_keys(left, excluded) == d.without_keys(right, excluded):
+                        is_reduced = True
+                        keys |= {binding[0] for binding in left[3] ^ right[3]}
+        return is_reduced, keys
+
+    @staticmethod
+    def references(some, others):
+        for one in some:
+            for other in others:
+                for lower, left in one.values.items():
+                    right = other.values.get(lower)
+                    if left and right and left[0] == right[0] == "reference":
+                        yield left, right
 
     # What the report says differs.
 
@@ -140,12 +181,32 @@ class Checker:
         return values.scalar(type_name, str(value))
 
     def value_faults(self, one, difference):
+        if one.kind == d.ONLY_OTHERS:
+            yield from self.disagreement_faults(one, difference)
         if one.kind != d.CHANGED:
             return
         shown = [other for other in difference["others"] if self.labels[one.index] in other["inventories"]]
         excluded = self.coverage[one.class_name]["excludedKeys"]
         yield from self.side_faults(one, 0, [difference["reference"]], excluded)
         yield from self.side_faults(one, one.index, shown, excluded)
+
+    def disagreement_faults(self, one, difference):
+        """Instances that the reference lacks are compared with one another."""
+        covered = self.coverage[one.class_name]
+        properties = set(self.comparison.properties(one.class_name)) - {p.lower() for p in covered["propertiesLeftOut"]}
+        indices = [self.labels.index(label) for label in difference["inventories"]]
+        expected = set()
+        for lower in properties:
+            found = [(i, v) for i in indices for v in self.instances(one, i)]
+            if any(self.comparison.disagree(one.class_name, lower, a, b, covered["excludedKeys"]) for a in found for b in found):
+                expected.add(lower)
+        said = {x["property"].lower() for x in difference.get("disagreements", [])}
+        if said != expected:
+            yield f"disagreements: {sorted(expected)}, not {sorted(said)}: {one}"
+
+    def instances(self, one, index):
+        excluded = {k.lower() for k in self.coverage[one.class_name]["excludedKeys"]}
+        return self.comparison.by_key(index, one.class_name, excluded).get(one.key, [])
 
     def side_faults(self, one, index, shown, excluded):
         """Whether the values shown for one inventory are its own."""
@@ -168,10 +229,20 @@ class Checker:
             "onlyInOthers": kinds.count(d.ONLY_OTHERS),
             "changedValues": kinds.count(d.CHANGED),
             "changedInstances": len({(x["class"], x["instance"]) for x in found if x["kind"] == d.CHANGED}),
+            "instancesOnlyInOthers": self.only_in_others(),
         }
         for field, count in counted.items():
             if summary[field] != count:
                 yield f"summary: {field} is {summary[field]}, but {count} are listed"
+
+    def only_in_others(self):
+        count = 0
+        for difference in self.report["differences"]:
+            if difference["kind"] == d.ONLY_OTHERS:
+                excluded = {k.lower() for k in self.coverage[difference["class"].lower()]["excludedKeys"]}
+                for one in self.flattened(difference):
+                    count += len(self.comparison.by_key(one.index, one.class_name, excluded).get(one.key, ["a made one"]))
+        return count
 
     def text_faults(self):
         """Equal keys have equal text, and other keys another text."""

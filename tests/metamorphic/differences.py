@@ -62,12 +62,6 @@ class Comparison:
                     found.setdefault(key, []).append(instance)
         return self.indexes[asked]
 
-    def sharing(self, name, excluded):
-        """For each inventory the number of instances that share their key with an earlier one."""
-        return [
-            sum(len(same) - 1 for same in self.by_key(index, name, excluded).values()) for index in range(len(self.inventories))
-        ]
-
     def type_of(self, index, class_name, lower):
         asked = (index, class_name)
         if asked not in self.declared:
@@ -76,10 +70,14 @@ class Comparison:
         return declared.type if declared else None
 
     def differs(self, index, class_name, lower, one, other, excluded_keys):
-        left, right = one.values.get(lower), other.values.get(lower)
+        return self.disagree(class_name, lower, (0, one), (index, other), excluded_keys)
+
+    def disagree(self, class_name, lower, one, other, excluded_keys):
+        """Whether two instances (inventory, instance) have different values of a property."""
+        left, right = one[1].values.get(lower), other[1].values.get(lower)
         if left is None or right is None:
             return left is not right
-        types = self.type_of(0, class_name, lower), self.type_of(index, class_name, lower)
+        types = [self.type_of(index, class_name, lower) for index in (one[0], other[0])]
         if None not in types and types[0].replace("object", "string") != types[1].replace("object", "string"):
             return True
         if excluded_keys and left[0] == right[0] == "reference":
@@ -89,11 +87,19 @@ class Comparison:
             return values.as_bag(left) != values.as_bag(right)
         return left != right
 
+    def positions(self, name):
+        """The other inventories that have a part in the comparison of a class: all, except that what cimdelta makes is not compared."""
+        others = range(1, len(self.inventories))
+        if name != inventory.OPERATING_SYSTEM:
+            return list(others)
+        counts = self.count(name)
+        return [index for index in others if counts[0] and counts[index]]
+
     def of_class(self, name, properties, excluded_keys):
         """All differences of the instances of one class if these properties count and these keys do not."""
         excluded = {key.lower() for key in excluded_keys}
         reference = self.by_key(0, name, excluded)
-        for index in range(1, len(self.inventories)):
+        for index in self.positions(name):
             others = self.by_key(index, name, excluded)
             for key in reference.keys() - others.keys():
                 yield Difference(ONLY_REFERENCE, name, key, "", index)
@@ -107,7 +113,7 @@ class Comparison:
 
     def value_choices(self, index, name, key, lower, excluded_keys):
         """The values of a property in the instances of one inventory with this key."""
-        excluded = {k.lower() for k in excluded_keys}
+        excluded = {key.lower() for key in excluded_keys}
         return [instance.values.get(lower) for instance in self.by_key(index, name, excluded).get(key, [])]
 
 

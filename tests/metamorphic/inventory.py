@@ -138,16 +138,12 @@ def type_of(element):
 def embedded(text, schema):
     root = etree.fromstring(text.encode(), XML)
     properties = []
-    declared = schema.properties(root.get("CLASSNAME") or root.get("NAME"))
     for element in root:
         if element.tag.startswith("PROPERTY"):
-            name = element.get("NAME").lower()
             type_name = type_of(element)
             value = value_of(element, type_name, schema, None)
-            if name in declared and declared[name].is_bag:
-                value = values.as_bag(value)
             if value is not None:  # as an absent one
-                properties.append((name, type_name.replace("object", "string"), value))
+                properties.append((element.get("NAME").lower(), type_name.replace("object", "string"), value))
     return ("object", root.tag, (root.get("CLASSNAME") or root.get("NAME")).lower(), frozenset(properties))
 
 

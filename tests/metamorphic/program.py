@@ -60,13 +60,19 @@ class Program:
         self.known.clear()
 
     def compare(self, inventories, rules=None, output_format="json", options=()):
-        """The output of a comparison as bytes."""
+        """The result of a comparison, even if nothing was compared."""
         documents = list(inventories) + ([("rules.xml", rules)] if rules is not None else [])
-        arguments = ["compare", "-o", output_format, *options, *(["--spec", "rules.xml"] if rules is not None else [])]
+        arguments = ["compare", "--allow-empty", "-o", output_format, *options, *(["--spec", "rules.xml"] if rules is not None else [])]
         result = self.run([*arguments, *(name for name, _ in inventories)], documents)
         if result.status not in (0, 1):
             raise Refusal(f"compare ended with status {result.status}: {result.messages.strip()[-600:]}")
         return result
+
+    def status(self, inventories, rules=None):
+        """The exit status of a comparison without options."""
+        documents = list(inventories) + ([("rules.xml", rules)] if rules is not None else [])
+        arguments = ["compare", *(["--spec", "rules.xml"] if rules is not None else []), *(name for name, _ in inventories)]
+        return self.run(arguments, documents).status
 
     def report(self, inventories, rules=None, options=()):
         """The JSON report of a comparison."""

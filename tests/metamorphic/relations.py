@@ -86,6 +86,15 @@ def is_what_the_files_say(case):
     yield from case.read(case.report()).faults()
 
 
+def ends_with_the_right_status(case):
+    """0 without differences, 1 with differences, 2 if nothing was compared."""
+    report = case.report()
+    right = 2 if report["summary"]["nothingCompared"] else 1 if report["differences"] else 0
+    status = case.run.status(case.documents, case.rules)
+    if status != right:
+        yield f"status: {status}, not {right}"
+
+
 def shows_what_the_files_say(case):
     """`show` gives each instance with the values in the file."""
     for name, data in case.documents:
@@ -289,6 +298,7 @@ def class_of_path(path):
 
 ALL = [
     is_what_the_files_say,
+    ends_with_the_right_status,
     shows_what_the_files_say,
     equals_itself,
     equals_its_rewritings,

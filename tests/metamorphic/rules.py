@@ -7,7 +7,8 @@ import dataclasses
 
 from lxml import etree
 
-COLLECTION_TIME = "DateTimeOfCollection"
+ROOT = "<root>"
+COLLECTION_TIME = "datetimeofcollection"
 
 
 @dataclasses.dataclass
@@ -33,6 +34,9 @@ class Rules:
         for element in etree.fromstring(data).iterchildren("class"):
             self.close(element)
 
+    def is_reached(self, name):
+        return name in self.by_class
+
     def close(self, element):
         rules = ClassRules(element.get("default") == "include", {}, tuple((element.get("excludekeys") or "").split()))
         for value in element.iter("value"):
@@ -50,7 +54,7 @@ class Rules:
             entry.is_final = is_own
 
     def push_down(self, name):
-        for child in self.schema.children(name):
+        for child in self.schema.children("" if name == ROOT else name):
             self.add(child, self.by_class[name], False)
             self.push_down(child)
 
@@ -63,7 +67,7 @@ class Rules:
         names = [declared.name for declared in self.schema.properties(name).values()]
         if not rules.includes:
             return {listed.lower() for listed, is_compared in rules.listed.items() if is_compared}
-        return {p.lower() for p in names if p != COLLECTION_TIME and rules.listed.get(p, True)}
+        return {p.lower() for p in names if p.lower() != COLLECTION_TIME and rules.listed.get(p, True)}
 
     def excluded_keys(self, name):
         return set(self.of(name).excluded_keys)
