@@ -21,6 +21,12 @@ def lines_of(text):
     return found
 
 
+def leaves(difference):
+    """The properties that the text shows: of embedded instances, those in which they differ."""
+    parts = difference.get("parts")
+    return [leaf for part in parts for leaf in leaves(part)] if parts else [difference["property"]]
+
+
 def expected(report):
     """The same of the JSON report."""
     found = []
@@ -30,7 +36,7 @@ def expected(report):
         if sign != "~" or not found or found[-1][:3] != head[:3]:
             found.append(head)
         if sign == "~":
-            found[-1][3].append(difference["property"])
+            found[-1][3].extend(leaves(difference))
     return found
 
 
