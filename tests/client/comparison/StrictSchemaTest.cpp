@@ -149,6 +149,12 @@ TEST_F(StrictSchemaTest, EachInstanceHasTheKeysOfItsOwnClass)
     EXPECT_NE(std::string::npos, report.find("{\"kind\":\"keysDiffer\",\"inventory\":\"b\",")) << report;
 }
 
+TEST_F(StrictSchemaTest, AClassThatTheReferenceDoesNotDeclareIsReported)
+{
+    const std::string report = Compare(Document(System()), Disks(KeyProperty("Id"), Disk(Value("Id", "1"))), {"--strict-schema"});
+    EXPECT_NE(std::string::npos, report.find("\nNot compared, because a does not declare the class: Disk (0 / 1).\n")) << report;
+}
+
 TEST_F(StrictSchemaTest, NamesThatDifferInLetterCaseAreReported)
 {
     const std::string a = Scratch("a.xml", Disks(KeyProperty("Id"), Disk(Value("Id", "1"))));
