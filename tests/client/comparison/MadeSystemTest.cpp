@@ -92,7 +92,7 @@ TEST_F(MadeSystemTest, WhereOnlyOneIsRealTheClassIsNotCompared)
 {
     const std::string rules = Including();
     const std::vector<std::vector<std::string>> sets{
-        {fFirst, fThird}, {fThird, fFirst}, {fThird, fFirst, fSecond}, {fFirst, fThird, fThird}};
+        {fFirst, fThird}, {fThird, fFirst}, {fThird, fFirst, fSecond}, {fFirst, fThird, Scratch("d.xml", ReadFile(fThird))}};
     for (const std::vector<std::string>& inventories : sets) {
         for (const std::vector<std::string>& options :
              {std::vector<std::string>{"--allow-empty"}, {"--allow-empty", "--spec", rules}}) {
