@@ -267,8 +267,8 @@ class Generator:
             old = self.random.choice(chosen)
             declared = Property(old.name, self.random.choice(VALUE_TYPES))  # embedded objects keep the old one
             cls.own[cls.own.index(old)] = declared
-            for _, literals in document.instances:
-                if declared.name in literals:
+            for class_name, literals in document.instances:
+                if any(p is declared for p in document.properties(class_name)):
                     literals[declared.name] = self.make_value(document, declared, 0)
 
     def change_statics(self, document):

@@ -18,12 +18,22 @@ import text_report
 import values
 
 
+REWRITINGS_AT_ONCE = 3
+
+
 @dataclasses.dataclass
 class Case:
     run: program.Program
     documents: list  # [(file name, bytes)], the reference first
     rules: bytes = None
     seed: int = 0
+    is_thorough: bool = True
+
+    def some(self, rewritings, relation):
+        """All rewritings, or a few of them, others for other seeds."""
+        if self.is_thorough:
+            return rewritings
+        return self.random(relation).sample(rewritings, min(len(rewritings), REWRITINGS_AT_ONCE))
 
     def random(self, name):
         return random.Random(f"{self.seed} {name}")
@@ -54,7 +64,8 @@ def values_of(read, one, difference):
     if one.kind != d.CHANGED:
         return (None, None)
     declared = [read.comparison.type_of(index, one.class_name, one.property) or read.key_type(one.class_name, one.property) for index in (0, one.index)]
-    is_bag = read.comparison.properties(one.class_name)[one.property].is_bag
+    found = [inv.schema.properties(one.class_name).get(one.property) for inv in read.comparison.inventories]
+    is_bag = any(declaration and declaration.is_bag for declaration in found)  # of either side, because the sides change places
     reference = read.canonical(declared[0], difference["reference"]["value"])
     others = [
         read.canonical(declared[1], other["value"])
@@ -135,7 +146,7 @@ def equals_itself(case):
 
 
 def equals_its_rewritings(case):
-    for how in rewriting.ALL:
+    for how in case.some(rewriting.ALL, "rewritings"):
         name, data = case.documents[case.random(how.__name__).randrange(len(case.documents))]
         other = how(data, case.random(how.__name__))
         report = case.run.report([("one.xml", data), ("two.xml", other)])
@@ -147,7 +158,7 @@ def report_does_not_change(case):
     """Rewritten inventories give the same report, byte for byte."""
     before = case.run.compare(case.documents, case.rules, "json").output
     shares = has_sharing(json.loads(before))
-    for how in rewriting.ALIKE:
+    for how in case.some(rewriting.ALIKE, "alike"):
         if shares and how is rewriting.declarations_in_another_order:
             continue  # the first of several instances in the file stands for all
         documents = [(name, how(data, case.random(how.__name__ + name))) for name, data in case.documents]

@@ -2,12 +2,13 @@
 
     run.py PART --program CIMDELTA --root ROOT [--sets PROGRAM] [--seed N] [--count N] [--features LIST] [--only NAME] [--keep FOLDER]
 
-PART is `random`, `rules` (random inventories with random rules), `files`, `sets`, or `compare`, which checks the report on the inventories that
-follow (`run.py compare --program P --root R [--rules RULES] REFERENCE OTHER...`). A failure prints the seed, what is wrong and the smallest documents
+PART is `random`, `rules` (random inventories with random rules), `files`, `sets`, `lies` (the relations themselves, on wrong results), or `compare`,
+which checks the report on the inventories that follow (`run.py compare --program P --root R [--rules RULES] REFERENCE OTHER...`). A failure prints the seed, what is wrong and the smallest documents
 that show it, and keeps them in a folder. The exit status is 0 if nothing was wrong, 1 if something was, and 2 if the run could not be made.
 """
 
 import argparse
+import dataclasses
 import pathlib
 import subprocess
 import sys
@@ -20,12 +21,14 @@ except ImportError:
     sys.exit("tests/metamorphic needs lxml: apt-get install python3-lxml, and run it with /usr/bin/python3")
 
 import generator
+import lies
 import program
 import relations
 import shrinking
 
 COUNTS = {"random": 24, "rules": 24, "sets": 150, "files": 1}
 FIRST_SEED = 1
+LIE_SEEDS = 12  # within so many cases a lie must be noticed
 MAY_OCCUR = ("schemas",)
 SHOWN_BYTES = 6000
 FAULTS_SHOWN = 5
@@ -52,7 +55,7 @@ class Runner:
 
     def case(self, name, documents, rules, seed, chosen=None):
         self.cases += 1
-        case = relations.Case(self.run, documents, rules, seed)
+        case = relations.Case(self.run, documents, rules, seed, self.arguments.thorough)
         for relation in chosen or self.relations():
             found = self.faults(relation, case)
             if found:
@@ -67,7 +70,7 @@ class Runner:
         kind = kind_of(found[0])
 
         def fails(documents, rules):
-            smaller = relations.Case(self.run, documents, rules, case.seed)
+            smaller = dataclasses.replace(case, documents=documents, rules=rules)
             return any(kind_of(fault) == kind for fault in self.faults(relation, smaller))
 
         documents = shrinking.Shrinker(fails).shrink(case.documents, case.rules)
@@ -78,7 +81,7 @@ class Runner:
         for file_name, data in files:
             (folder / file_name).write_bytes(data)
             print(f"    {file_name}: {data[:SHOWN_BYTES].decode(errors='replace')}")
-        for fault in self.faults(relation, relations.Case(self.run, documents, case.rules, case.seed))[:FAULTS_SHOWN]:
+        for fault in self.faults(relation, dataclasses.replace(case, documents=documents))[:FAULTS_SHOWN]:
             print(f"    then: {fault[:1500]}")
 
     # Parts.
@@ -107,6 +110,33 @@ class Runner:
                     documents = [(path.name, path.read_bytes()) for path in paths]
                     self.case(f"set {seed}", documents, rules, seed, [relations.is_what_the_files_say, relations.formats_agree])
 
+    def lies(self):
+        """Each relation fails for a program that is wrong in its way."""
+        noticed = {relation for _, relation, _, _ in lies.LIES}
+        self.failures += len(set(relations.ALL) - noticed)
+        for relation in set(relations.ALL) - noticed:
+            print(f"{relation.__name__}: no lie shows that it can fail")
+        for name, relation, kind, lie in lies.LIES:
+            self.cases += 1
+            if not self.is_noticed(relation, kind, lie):
+                self.failures += 1
+                print(f"{name}: {relation.__name__} does not notice")
+
+    def is_noticed(self, relation, kind, lie):
+        told = 0
+        for seed in range(self.arguments.seed, self.arguments.seed + LIE_SEEDS):
+            made = generator.Generator(seed, MAY_OCCUR)
+            documents = [(f"{chr(97 + index)}.xml", data) for index, data in enumerate(made.make_documents(3))]
+            liar = kind(self.arguments.program, self.arguments.root, self.run.folder / "lies", lie)
+            case = relations.Case(liar, documents, made.make_rules() if seed % 2 else None, seed)
+            faults = self.faults(relation, case)
+            self.run.runs += liar.runs
+            told += liar.told
+            liar.forget()
+            if faults and told and "the checker failed" not in faults[0] and not faults[0].startswith("refused"):
+                return True
+        return False
+
     def given(self):
         """The inventories of the command line."""
         documents = [(f"{number}-{path.name}", path.read_bytes()) for number, path in enumerate(self.arguments.inventories)]
@@ -131,7 +161,7 @@ def kind_of(fault):
 
 def main():
     parser = argparse.ArgumentParser(description="Relations between runs of cimdelta")
-    parser.add_argument("part", choices=["random", "rules", "files", "sets", "compare"])
+    parser.add_argument("part", choices=["random", "rules", "files", "sets", "lies", "compare"])
     parser.add_argument("inventories", nargs="*", type=pathlib.Path)
     parser.add_argument("--program", required=True, type=pathlib.Path)
     parser.add_argument("--root", required=True, type=pathlib.Path)
@@ -140,6 +170,7 @@ def main():
     parser.add_argument("--seed", type=int, default=FIRST_SEED)
     parser.add_argument("--count", type=int)
     parser.add_argument("--features", type=lambda text: tuple(text.split(",")), default=MAY_OCCUR)
+    parser.add_argument("--thorough", action="store_true", help="all rewritings of each document, not a few")
     parser.add_argument("--only", help="one relation by its name")
     parser.add_argument("--keep", default=pathlib.Path(tempfile.gettempdir()) / "cimdelta-metamorphic", help="where failing documents are kept")
     arguments = parser.parse_args()
@@ -151,6 +182,7 @@ def main():
             "random": lambda: runner.random_inventories(False),
             "rules": lambda: runner.random_inventories(True),
             "files": runner.files,
+            "lies": runner.lies,
             "sets": runner.sets,
             "compare": runner.given,
         }

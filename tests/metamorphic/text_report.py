@@ -3,7 +3,7 @@
 import re
 
 SIGNS = {"onlyInReference": "-", "onlyInOthers": "+", "changed": "~"}
-PROPERTY = re.compile(r"    ([^\s:]+): ")
+PROPERTY = re.compile(r"    ([^\s:.]+)[^\s:]*: ")  # of an embedded object: the property that holds it
 
 
 def lines_of(text):
@@ -17,7 +17,9 @@ def lines_of(text):
         elif line[:2] in ("- ", "+ ", "~ "):
             found.append((name, line[0], line[2:], []))
         elif found and PROPERTY.match(line):
-            found[-1][3].append(PROPERTY.match(line).group(1))
+            name_of_property = PROPERTY.match(line).group(1)
+            if name_of_property not in found[-1][3]:
+                found[-1][3].append(name_of_property)
     return found
 
 
@@ -33,6 +35,7 @@ def expected(report):
     for difference in report["differences"]:
         sign = SIGNS[difference["kind"]]
         head = [difference["class"], sign, difference["instance"][len(difference["class"]) + 1 :], []]
+        head[3] += [one["property"] for one in difference.get("disagreements", [])]
         if sign != "~" or not found or found[-1][:3] != head[:3]:
             found.append(head)
         if sign == "~":
@@ -46,7 +49,7 @@ def faults(text, report):
         yield f"text: {len(shown)} lines of instances, but JSON has {len(listed)}"
         return
     for one, other in zip(shown, listed):
-        if (one[0], one[1]) != (other[0], other[1]) or one[1] == "~" and one[3] != other[3]:
+        if (one[0], one[1]) != (other[0], other[1]) or one[3] != other[3]:
             yield f"text: {one}, but JSON has {other}"
         elif other[2].isascii() and other[2].isprintable() and "\\" not in other[2] and not one[2].startswith(other[2]):
             yield f"text: instance {one[2]}, but JSON has {other[2]}"
