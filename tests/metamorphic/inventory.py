@@ -97,11 +97,14 @@ class Schema:
             return paths.untyped(form, text)
         if not form and text == "NULL":
             return None
-        if declared.type == "reference":
-            return paths.canonical(text, self)
-        if declared.type == "object":
-            return embedded(text, self)
-        return values.scalar(declared.type, text)
+        try:
+            if declared.type == "reference":
+                return paths.canonical(text, self)
+            if declared.type == "object":
+                return embedded(text, self)
+            return values.scalar(declared.type, text)
+        except (ValueError, IndexError, etree.XMLSyntaxError):  # a path may have keys that its class cannot have
+            return paths.untyped(form, text)
 
 
 def decompressed(data):
@@ -113,7 +116,7 @@ def decompressed(data):
 
 
 def flag(element, qualifier):
-    return any(q.get("NAME").lower() == qualifier and (q.findtext("VALUE") or "").strip().lower() == "true" for q in element.iterchildren("QUALIFIER"))
+    return (qualifier_text(element, qualifier) or "").strip().lower() == "true"
 
 
 def qualifier_text(element, qualifier):
@@ -168,12 +171,14 @@ def value_of(element, type_name, schema, home):
     return None
 
 
-def place_of(element):
-    """(host, namespace) that a path element names, or None."""
-    names = [step.get("NAME") for step in element.iterfind(".//LOCALNAMESPACEPATH/NAMESPACE")]
-    if element.tag == "LOCALNAMESPACEPATH":
-        names = [step.get("NAME") for step in element.iterfind("NAMESPACE")]
-    return paths.place(element.findtext("NAMESPACEPATH/HOST"), "/".join(names))
+def place_of(path):
+    """(host, namespace) that the element of a path names, or None."""
+    steps = path.find("NAMESPACEPATH/LOCALNAMESPACEPATH")
+    if steps is None:
+        steps = path if path.tag == "LOCALNAMESPACEPATH" else path.find("LOCALNAMESPACEPATH")
+    if steps is None:
+        return None
+    return paths.place(path.findtext("NAMESPACEPATH/HOST"), "/".join(step.get("NAME") for step in steps))
 
 
 def reference_of(element, schema, home):
@@ -181,8 +186,7 @@ def reference_of(element, schema, home):
     target = element[0]
     where = None
     if target.tag in ("INSTANCEPATH", "LOCALINSTANCEPATH"):
-        names = [step.get("NAME") for step in (target.find("NAMESPACEPATH/LOCALNAMESPACEPATH") if target.tag == "INSTANCEPATH" else target.find("LOCALNAMESPACEPATH"))]
-        where = paths.place(target.findtext("NAMESPACEPATH/HOST"), "/".join(names))
+        where = place_of(target)
         target = target.find("INSTANCENAME")
     if where and home and where[1] == home[1] and (where[0] == home[0] or "" in (where[0], home[0])):
         where = None
@@ -222,15 +226,10 @@ class Inventory:
 
     def find_home(self, root):
         """Where the inventory is: what its declarations name, or what all its references name."""
-        for tag in ("CLASSPATH", "LOCALCLASSPATH", "INSTANCEPATH", "LOCALINSTANCEPATH", "LOCALNAMESPACEPATH"):
-            for element in root.iter(tag):
-                if element.getparent().tag not in ("VALUE.REFERENCE", "NAMESPACEPATH", "INSTANCEPATH", "LOCALINSTANCEPATH", "CLASSPATH", "LOCALCLASSPATH"):
-                    names = [step.get("NAME") for step in element.iter("NAMESPACE")]
-                    return paths.place(element.findtext("NAMESPACEPATH/HOST"), "/".join(names))
-        named = set()
-        for reference in root.iter("VALUE.REFERENCE"):
-            names = [step.get("NAME") for step in reference[0].iterfind(".//LOCALNAMESPACEPATH/NAMESPACE")] if reference[0].tag != "INSTANCENAME" else []
-            named.add(paths.place(reference[0].findtext("NAMESPACEPATH/HOST"), "/".join(names)))
+        for element in root.iter("CLASSPATH", "LOCALCLASSPATH", "INSTANCEPATH", "LOCALINSTANCEPATH", "IMETHODCALL"):
+            if element.getparent().tag != "VALUE.REFERENCE" and place_of(element):
+                return place_of(element)
+        named = {place_of(reference[0]) for reference in root.iter("VALUE.REFERENCE")}
         return named.pop() if len(named) == 1 and None not in named else ("", "root/cimv2")
 
     def add_static_values(self, element, schema):

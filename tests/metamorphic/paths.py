@@ -58,9 +58,9 @@ def canonical(text, schema):
 
 
 def untyped(form, text):
-    """The value of a key whose class nobody declares."""
+    """The value of a key whose class nobody declares, or declares otherwise."""
     if form:
-        return ("text", text)
+        return values.timestamp(text) if values.TIMESTAMP.fullmatch(text) else ("text", text)
     if text == "NULL":
         return None
     if text.lower() in ("true", "false"):

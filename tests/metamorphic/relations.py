@@ -63,7 +63,8 @@ def said(read):
 def values_of(read, one, difference):
     if one.kind != d.CHANGED:
         return (None, None)
-    declared = [read.comparison.type_of(index, one.class_name, one.property) or read.key_type(one.class_name, one.property) for index in (0, one.index)]
+    otherwise = read.key_type(one.class_name, one.property)
+    declared = [read.comparison.type_of(index, one.class_name, one.property) or otherwise for index in (0, one.index)]
     found = [inv.schema.properties(one.class_name).get(one.property) for inv in read.comparison.inventories]
     is_bag = any(declaration and declaration.is_bag for declaration in found)  # of either side, because the sides change places
     reference = read.canonical(declared[0], difference["reference"]["value"])
@@ -116,14 +117,15 @@ def shows_what_the_files_say(case):
                 continue
             shown = json.loads(case.run.document(["show", name, cls.name, "-o", "json"], (name, data)))
             below = {lower for lower in read.schema.classes if cls.name.lower() in read.schema.ancestry(lower)}
-            expected = sorted(instance_text(i.class_name, {k: v for k, v in i.values.items() if v is not None}) for i in read.instances if i.class_name in below)
-            found = sorted(shown_text(read, one) for one in shown)
-            if expected != found:
-                yield f"show: {name}: {cls.name}: in the file: {sorted(set(expected) - set(found))[:2]}; shown: {sorted(set(found) - set(expected))[:2]}"
+            expected = {instance_text(one.class_name, one.values) for one in read.instances if one.class_name in below}
+            found = [shown_text(read, one) for one in shown]
+            yield from difference_between(f"show {name} {cls.name}", expected, set(found))
+            if len(found) != len(expected):
+                yield f"show: {name}: {cls.name}: {len(found)} instances, not {len(expected)}"
 
 
 def instance_text(class_name, found):
-    return repr((class_name, sorted((name, repr(values.ordered(value))) for name, value in found.items())))
+    return repr((class_name, sorted((name, repr(values.ordered(value))) for name, value in found.items() if value is not None)))
 
 
 def shown_text(read, shown):
@@ -132,7 +134,7 @@ def shown_text(read, shown):
     comparison.schema = read.schema
     declared = read.schema.properties(lower)
     found = {name.lower(): comparison.canonical(declared[name.lower()].type, value) for name, value in shown["properties"].items()}
-    return instance_text(lower, {name: value for name, value in found.items() if value is not None})
+    return instance_text(lower, found)
 
 
 # The same inventory twice.
@@ -271,7 +273,8 @@ def formats_agree(case):
     if lines[:-1] != report["differences"]:
         yield "ndjson: other differences than in JSON"
     ending = dict(lines[-1])
-    if ending.pop("kind") != "coverage" or ending != {"inventories": report["inventories"], "summary": report["summary"], **report["coverage"]}:
+    right = {"inventories": report["inventories"], "summary": report["summary"], **report["coverage"]}
+    if ending.pop("kind") != "coverage" or ending != right:
         yield "ndjson: another coverage than in JSON"
     yield from text_report.faults(case.run.compare(case.documents, case.rules, "text").output.decode(), report)
     yield from record_faults(case.run.compare(case.documents, case.rules, "cimxml").output, report)
@@ -295,7 +298,8 @@ def record_faults(data, report):
         name = difference["instance"]
         if difference["class"] in excluding and difference["kind"] == d.ONLY_REFERENCE:
             continue  # the record has the full path
-        expected.add((difference["kind"], name, difference.get("property", ""), frozenset(labels.index(label) for label in difference["inventories"])))
+        indices = frozenset(labels.index(label) for label in difference["inventories"])
+        expected.add((difference["kind"], name, difference.get("property", ""), indices))
     found = {x for x in found if not (x[0] == d.ONLY_REFERENCE and class_of_path(x[1]) in excluding)}
     yield from difference_between("records", expected, found)
     links = sum(one.get("CLASSNAME") == "KALMO_DeltaClassAssocToDelta" for one in root.iter("INSTANCE"))

@@ -1,10 +1,11 @@
-"""Runs the relations over random inventories, over the inventories of this repository and over the random sets of the engine's tests.
+"""Runs the relations over random inventories, over inventories of this repository and over the random sets of the engine's tests.
 
-    run.py PART --program CIMDELTA --root ROOT [--sets PROGRAM] [--seed N] [--count N] [--features LIST] [--only NAME] [--keep FOLDER]
+    run.py PART --program CIMDELTA --root ROOT [--seed N] [--count N] [--features LIST] [--only NAME] [--thorough] [--keep FOLDER]
+    run.py compare --program CIMDELTA --root ROOT [--rules RULES] REFERENCE OTHER...
 
-PART is `random`, `rules` (random inventories with random rules), `files`, `sets`, `lies` (the relations themselves, on wrong results), or `compare`,
-which checks the report on the inventories that follow (`run.py compare --program P --root R [--rules RULES] REFERENCE OTHER...`). A failure prints the seed, what is wrong and the smallest documents
-that show it, and keeps them in a folder. The exit status is 0 if nothing was wrong, 1 if something was, and 2 if the run could not be made.
+PART is `random`, `rules` (random inventories with random rules), `files`, `sets` (needs --sets), or `lies` (the relations themselves, on wrong
+results). `compare` checks the report on the inventories that follow. A failure prints the seed, what is wrong and the smallest documents that show
+it, and keeps them in a folder. The exit status is 0 if nothing was wrong and 1 if something was, or if the run could not be made.
 """
 
 import argparse
@@ -20,7 +21,9 @@ try:
 except ImportError:
     sys.exit("tests/metamorphic needs lxml: apt-get install python3-lxml, and run it with /usr/bin/python3")
 
+import differences
 import generator
+import inventory
 import lies
 import program
 import relations
@@ -29,7 +32,7 @@ import shrinking
 COUNTS = {"random": 24, "rules": 24, "sets": 150, "files": 1}
 FIRST_SEED = 1
 LIE_SEEDS = 12  # within so many cases a lie must be noticed
-MAY_OCCUR = ("schemas",)
+MAY_OCCUR = ("schemas", "types", "systems", "statics", "moments", "objects", "places")
 SHOWN_BYTES = 6000
 FAULTS_SHOWN = 5
 
@@ -105,9 +108,9 @@ class Runner:
             subprocess.run([self.arguments.sets, folder, str(first), str(count)], check=True)
             for seed in range(first, first + count):
                 paths = sorted((pathlib.Path(folder) / str(seed)).glob("[0-9]*.xml"))
-                if len(paths) > 1:
-                    rules = (paths[0].parent / "rules.xml").read_bytes()
-                    documents = [(path.name, path.read_bytes()) for path in paths]
+                documents = [(path.name, path.read_bytes()) for path in paths]
+                rules = (pathlib.Path(folder) / str(seed) / "rules.xml").read_bytes()
+                if can_be_compared(documents, rules):
                     self.case(f"set {seed}", documents, rules, seed, [relations.is_what_the_files_say, relations.formats_agree])
 
     def lies(self):
@@ -153,13 +156,26 @@ FILES = [
 ]
 
 
+def can_be_compared(documents, rules_data):
+    """A set may have one namespace only, rules for what none declares, or no operating system whose type cimdelta could make up."""
+    read = [inventory.Inventory(data) for _, data in documents]
+    declared = differences.Comparison(read).schema
+    named = lxml.etree.fromstring(rules_data).iterchildren("class")
+    known = all(one.get("name").lower() in declared.classes and names(one) <= declared.properties(one.get("name")).keys() for one in named)
+    return len(documents) > 1 and known and any(one.class_name == inventory.OPERATING_SYSTEM for one in read[0].instances)
+
+
+def names(element):
+    return {value.text.lower() for value in element.iter("value")}
+
+
 def kind_of(fault):
     """What must stay the same while documents shrink: the beginning of the text, and its end if cimdelta refused."""
     words = fault.split()
     return " ".join(words[:4] + (words[-5:] if words[0] == "refused:" else []))
 
 
-def main():
+def read_arguments():
     parser = argparse.ArgumentParser(description="Relations between runs of cimdelta")
     parser.add_argument("part", choices=["random", "rules", "files", "sets", "lies", "compare"])
     parser.add_argument("inventories", nargs="*", type=pathlib.Path)
@@ -169,13 +185,18 @@ def main():
     parser.add_argument("--rules", type=pathlib.Path)
     parser.add_argument("--seed", type=int, default=FIRST_SEED)
     parser.add_argument("--count", type=int)
-    parser.add_argument("--features", type=lambda text: tuple(text.split(",")), default=MAY_OCCUR)
+    parser.add_argument("--features", type=lambda text: tuple(text.split(",")), default=MAY_OCCUR, help="what generator.py lists")
     parser.add_argument("--thorough", action="store_true", help="all rewritings of each document, not a few")
     parser.add_argument("--only", help="one relation by its name")
     parser.add_argument("--keep", default=pathlib.Path(tempfile.gettempdir()) / "cimdelta-metamorphic", help="where failing documents are kept")
     arguments = parser.parse_args()
     arguments.count = arguments.count or COUNTS.get(arguments.part, 1)
     arguments.program, arguments.root = arguments.program.resolve(), arguments.root.resolve()
+    return arguments
+
+
+def main():
+    arguments = read_arguments()
     with tempfile.TemporaryDirectory(prefix="cimdelta-metamorphic-") as scratch:
         runner = Runner(arguments, scratch)
         parts = {

@@ -3,7 +3,7 @@
 import re
 
 SIGNS = {"onlyInReference": "-", "onlyInOthers": "+", "changed": "~"}
-PROPERTY = re.compile(r"    ([^\s:.]+)[^\s:]*: ")  # of an embedded object: the property that holds it
+PROPERTY = re.compile(r"    ([^\s:]+): ")
 
 
 def lines_of(text):
@@ -17,9 +17,7 @@ def lines_of(text):
         elif line[:2] in ("- ", "+ ", "~ "):
             found.append((name, line[0], line[2:], []))
         elif found and PROPERTY.match(line):
-            name_of_property = PROPERTY.match(line).group(1)
-            if name_of_property not in found[-1][3]:
-                found[-1][3].append(name_of_property)
+            found[-1][3].append(PROPERTY.match(line).group(1))
     return found
 
 
@@ -35,7 +33,7 @@ def expected(report):
     for difference in report["differences"]:
         sign = SIGNS[difference["kind"]]
         head = [difference["class"], sign, difference["instance"][len(difference["class"]) + 1 :], []]
-        head[3] += [one["property"] for one in difference.get("disagreements", [])]
+        head[3].extend(leaf for one in difference.get("disagreements", []) for leaf in leaves(one))
         if sign != "~" or not found or found[-1][:3] != head[:3]:
             found.append(head)
         if sign == "~":

@@ -22,7 +22,7 @@ import struct
 
 INTEGERS = ("uint8", "sint8", "uint16", "sint16", "uint32", "sint32", "uint64", "sint64")
 REALS = ("real32", "real64")
-TIMESTAMP = re.compile(r"[0-9*]{14}\.[0-9*]{6}[+-][0-9*]{3}")
+TIMESTAMP = re.compile(r"[0-9*]{14}\.[0-9*]{6}[+:-][0-9*]{3}")
 
 
 def integer(text):
