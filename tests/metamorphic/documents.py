@@ -39,6 +39,7 @@ class Property:
     is_key: bool = False
     order: str = ""  # the qualifier ArrayType, or "OctetString"
     static: object = None  # a literal: the property is static and has this value
+    default: object = None  # a literal that the declaration has and that no instance takes
 
 
 @dataclasses.dataclass
@@ -150,7 +151,7 @@ def class_element(parent, cls):
     if any(p.type == "reference" for p in cls.own):
         qualifier(element, "Association", "boolean", "TRUE")
     for declared in cls.own:
-        property_element(element, declared, declared.static, True)
+        property_element(element, declared, declared.static or declared.default, True)
 
 
 def place_element(parent, document, tag):

@@ -100,6 +100,8 @@ class Generator:
             made.order = self.random.choice(["", "", "Bag", "Ordered", "Indexed"])
         if "statics" in self.features and self.one_in(8) and made.type not in ("reference", "object"):
             made.static = self.make_value(None, made, 0)
+        elif self.one_in(6) and made.type not in ("reference", "object"):
+            made.default = self.make_value(None, made, 0)
         return made
 
     # Values.

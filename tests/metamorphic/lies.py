@@ -136,6 +136,16 @@ def lose_instance(command):
     return lie
 
 
+def on_encoded_rules(result, arguments, documents):
+    """Rules that are not plain UTF-8 are taken for others."""
+    rules = dict(documents).get("rules.xml", b"")
+    return on_report(drop_difference)(result, arguments, documents) if b"&#" in rules or b"encoding" in rules else None
+
+
+def explain_all(result, arguments, _documents):
+    return dataclasses.replace(result, output=result.output.replace(b": not compared", b": compared")) if arguments[0] == "explain" else None
+
+
 class IgnoresLists(LyingProgram):
     """A program that does not know excludelist."""
 
@@ -165,6 +175,8 @@ LIES = [
     ("new instances are not reported", relations.mirrors, LyingProgram, on_report(drop_new_instances)),
     ("a third inventory hides", relations.many_are_pairs, LyingProgram, on_report(drop_if(lambda data: len(data) > 2))),
     ("lists of rules are not read", relations.excluding_removes_exactly_that, IgnoresLists, None),
+    ("entities of rules are not read", relations.rules_may_be_written_otherwise, LyingProgram, on_encoded_rules),
+    ("explain includes all", relations.explain_says_what_is_compared, LyingProgram, explain_all),
     ("a line is missing", relations.formats_agree, LyingProgram, without_first_line("ndjson", rb'\{"kind":"[a-z]*[^\n]*\n')),
     ("a line of text is missing", relations.formats_agree, LyingProgram, without_first_line("text", rb"\n[-+~] [^\n]*")),
     ("a record is missing", relations.formats_agree, LyingProgram, without_first_line("cimxml", RECORD)),

@@ -6,6 +6,7 @@ Each relation takes a Case and yields what is wrong, one text each.
 import dataclasses
 import json
 import random
+import re
 
 from lxml import etree
 
@@ -264,6 +265,33 @@ def excluding_removes_exactly_that(case):
     yield from difference_between(f"without {classes[lower].name}.{chosen.name}", expected, case.said(rules=etree.tostring(base)))
 
 
+def rules_may_be_written_otherwise(case):
+    """Rules mean the same in any XML that says the same."""
+    if case.rules is None:
+        return
+    before = case.run.compare(case.documents, case.rules, "json").output
+    for how in case.some(rewriting.RULES, "rules"):
+        after = case.run.compare(case.documents, how(case.rules, case.random(how.__name__)), "json").output
+        if before != after:
+            yield f"rules rewritten {how.__name__}: {first_difference(before, after)}"
+
+
+def explain_says_what_is_compared(case):
+    """`explain` and the coverage of the comparison agree, property by property."""
+    read = case.read(case.report())
+    options = [part for name, _ in case.documents for part in ("--schema", name)] + (["--spec", "rules.xml"] if case.rules is not None else [])
+    documents = case.documents + ([("rules.xml", case.rules)] if case.rules is not None else [])
+    for lower, covered in read.coverage.items():
+        if covered["state"] == "madeByCimdelta":
+            continue
+        result = case.run.run(["explain", covered["class"], *options], documents)
+        verdicts = re.findall(r"^  ([^\s:]+): (not )?compared", result.output.decode(), re.M)
+        explained = {name.lower() for name, negation in verdicts if not negation}
+        yield from difference_between(f"explain {covered['class']}", read.comparison.rules.compared(lower), explained)
+        if len(verdicts) != len(read.comparison.properties(lower)):
+            yield f"explain {covered['class']}: {len(verdicts)} properties, not {len(read.comparison.properties(lower))}"
+
+
 # Formats.
 
 
@@ -324,5 +352,7 @@ ALL = [
     mirrors,
     many_are_pairs,
     excluding_removes_exactly_that,
+    rules_may_be_written_otherwise,
+    explain_says_what_is_compared,
     formats_agree,
 ]

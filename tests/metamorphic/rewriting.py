@@ -11,7 +11,7 @@ from lxml import etree
 
 import inventory
 
-TEXT_TAGS = ("VALUE", "KEYVALUE", "HOST")
+TEXT_TAGS = ("VALUE", "KEYVALUE", "HOST", "value")  # value is an element of rules
 NAME_ATTRIBUTES = ("NAME", "CLASSNAME", "SUPERCLASS", "REFERENCECLASS", "CLASSORIGIN")
 KEEPS_CASE = ("NAMESPACE", "IMETHODCALL", "METHODCALL", "IPARAMVALUE", "PARAMVALUE", "IMETHODRESPONSE", "ERROR")
 
@@ -289,3 +289,4 @@ COMPRESSIONS = [gzipped, xz, zstd]
 ALIKE = XML_ONLY + ENCODINGS + COMPRESSIONS + [declarations_in_another_order, nulls_left_out]  # the report stays the same, byte for byte
 DISPLAY = [properties_in_another_order, bags_in_another_order, names_in_another_case, values_in_another_spelling]
 ALL = ALIKE + DISPLAY
+RULES = XML_ONLY[:-1] + ENCODINGS  # what rules can be written as

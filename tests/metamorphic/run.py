@@ -189,7 +189,7 @@ def read_arguments():
     parser.add_argument("--thorough", action="store_true", help="all rewritings of each document, not a few")
     parser.add_argument("--only", help="one relation by its name")
     parser.add_argument("--keep", default=pathlib.Path(tempfile.gettempdir()) / "cimdelta-metamorphic", help="where failing documents are kept")
-    arguments = parser.parse_args()
+    arguments = parser.parse_intermixed_args()
     arguments.count = arguments.count or COUNTS.get(arguments.part, 1)
     arguments.program, arguments.root = arguments.program.resolve(), arguments.root.resolve()
     return arguments
