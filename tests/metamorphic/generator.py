@@ -62,6 +62,8 @@ class Generator:
     statics   static properties
     moments   datetime keys that are the same moment in other spellings
     objects   embedded objects as keys
+    orders    an array that is a bag in one inventory and ordered in another
+    keyless   classes without keys
     places    references whose namespaces differ only in letter case
     """
 
@@ -83,7 +85,8 @@ class Generator:
             if number and not self.one_in(3):
                 superclass = self.random.choice(classes[1:]).name
             else:
-                for key in range(self.random.choice((1, 1, 2, 3))):
+                counts = (0, 1, 1, 2, 3) if "keyless" in self.features else (1, 1, 2, 3)
+                for key in range(self.random.choice(counts)):
                     types = KEY_TYPES + (["object"] if "objects" in self.features else [])
                     own.append(Property(f"Key{key}of{number}", self.random.choice(types), is_key=True))
             for value in range(self.random.randint(1, 5)):
@@ -180,6 +183,8 @@ class Generator:
             self.change_type(other)
         if "statics" in self.features:
             self.change_statics(other)
+        if "orders" in self.features:
+            self.change_orders(other)
         changed = []
         for class_name, literals in other.instances:
             if self.one_in(6) and class_name != OPERATING_SYSTEM:
@@ -233,6 +238,12 @@ class Generator:
             for declared in cls.own:
                 if declared.static is not None and self.one_in(2):
                     declared.static = self.make_value(None, dataclasses.replace(declared, static=None), 0)
+
+    def change_orders(self, document):
+        for cls in document.classes:
+            for index, declared in enumerate(cls.own):
+                if declared.is_array and self.one_in(2):
+                    cls.own[index] = dataclasses.replace(declared, order=self.random.choice(["", "Bag", "Ordered", "Indexed"]))
 
     def make_documents(self, count):
         """`count` inventories as bytes, the reference first."""

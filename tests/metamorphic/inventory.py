@@ -185,12 +185,13 @@ def reference_of(element, schema, home):
     """A VALUE.REFERENCE. `home` is where its inventory is; a reference into it has no place."""
     target = element[0]
     where = None
-    if target.tag in ("INSTANCEPATH", "LOCALINSTANCEPATH"):
+    if target.tag.endswith("PATH"):
         where = place_of(target)
-        target = target.find("INSTANCENAME")
+        target = target[-1]
     if where and home and where[1] == home[1] and (where[0] == home[0] or "" in (where[0], home[0])):
         where = None
-    return ("reference", where, target.get("CLASSNAME").lower(), frozenset(bindings_of(target, schema, home)))
+    name = target.get("CLASSNAME") or target.get("NAME")  # a class is referred to like an instance without keys
+    return ("reference", where, name.lower(), frozenset(bindings_of(target, schema, home)))
 
 
 def bindings_of(instance_name, schema, home):

@@ -32,7 +32,7 @@ import shrinking
 COUNTS = {"random": 24, "rules": 24, "sets": 150, "files": 1}
 FIRST_SEED = 1
 LIE_SEEDS = 12  # within so many cases a lie must be noticed
-MAY_OCCUR = ("schemas", "types", "systems", "statics", "moments", "objects", "places")
+MAY_OCCUR = ("schemas", "types", "systems", "statics", "moments", "objects", "orders", "keyless", "places")
 SHOWN_BYTES = 6000
 FAULTS_SHOWN = 5
 
