@@ -66,8 +66,6 @@ def values_of(read, one, difference):
         return (None, None)
     otherwise = read.key_type(one.class_name, one.property)
     declared = [read.comparison.type_of(index, one.class_name, one.property) or otherwise for index in (0, one.index)]
-    found = [inv.schema.properties(one.class_name).get(one.property) for inv in read.comparison.inventories]
-    is_bag = any(declaration and declaration.is_bag for declaration in found)  # of either side, because the sides change places
     reference = read.canonical(declared[0], difference["reference"]["value"])
     others = [
         read.canonical(declared[1], other["value"])
@@ -77,9 +75,8 @@ def values_of(read, one, difference):
     excluded = read.coverage[one.class_name]["excludedKeys"]
     if excluded and declared == ["reference", "reference"]:  # the value shown stands for all that are equal without these keys
         reference, *others = (d.without_keys(value, excluded) if value else None for value in (reference, *others))
-    if is_bag:
-        reference, others = values.as_bag(reference), [values.as_bag(other) for other in others]
-    return reference, frozenset(others)
+    # Which side is the reference decides whether the order counts. The order that is shown is checked against the files.
+    return values.as_bag(reference), frozenset(map(values.as_bag, others))
 
 
 def difference_between(name, one, other):
