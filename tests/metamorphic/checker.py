@@ -3,6 +3,8 @@
 Every difference in the files must be reported, or the report must name what was not compared. Nothing may be reported that is not in the files.
 """
 
+from lxml import etree
+
 import differences as d
 import inventory
 import paths
@@ -172,7 +174,10 @@ class Checker:
             base = type_name.replace("[]", "")
             return ("array", tuple(self.canonical(base, item) for item in value))
         if type_name == "object":
-            return inventory.embedded(value, self.schema)
+            try:
+                return inventory.embedded(value, self.schema)
+            except etree.XMLSyntaxError:
+                return ("text", value)  # beside objects
         if type_name == "reference":
             return paths.canonical(value, self.schema)
         if isinstance(value, bool):

@@ -215,8 +215,19 @@ class Inventory:
         self.root = etree.fromstring(decompressed(data), XML)
         self.schema = Schema()
         self.schema.add({element.get("NAME").lower(): class_of(element) for element in self.root.iter("CLASS")})
+        self.find_objects()
         self.home = self.find_home(self.root)
         self.instances = []
+
+    def find_objects(self):
+        """A property declared as plain text holds objects if an instance says so."""
+        for element in self.root.iter("INSTANCE"):
+            for child in element.iterchildren("PROPERTY", "PROPERTY.ARRAY"):
+                for ancestor in self.schema.ancestry(element.get("CLASSNAME")) if holds_objects(child) else ():
+                    declared = self.schema.classes[ancestor].own.get(child.get("NAME").lower())
+                    if declared:
+                        declared.type = declared.type.replace("string", "object")
+        self.schema.known = {}
 
     def read_instances(self, schema):
         for element in self.root.iter("CLASS"):
