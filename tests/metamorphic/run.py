@@ -172,7 +172,7 @@ def names(element):
 def kind_of(fault):
     """What must stay the same while documents shrink: the beginning of the text, and its end if cimdelta refused."""
     words = fault.split()
-    return " ".join(words[:4] + (words[-5:] if words[0] == "refused:" else []))
+    return " ".join([word for word in words[:8] if "=" not in word] + (words[-5:] if words[0] == "refused:" else []))
 
 
 def read_arguments():
