@@ -11,11 +11,9 @@
 
 #include "embedded/store/TReferenceAdapter.h"
 
-#include <algorithm>
-#include <boost/smart_ptr/make_shared.hpp>
 #include <unordered_set>
 
-#include "embedded/value/TEmbeddedObject.h"
+#include "embedded/value/ChangeReferences.h"
 #include "embedded/value/TValueAccess.h"
 #include "embedded/value/TValueText.h"
 
@@ -105,17 +103,7 @@ const TInMemPropertyDecl* TReferenceAdapter::AdaptKey(const TInMemClass& cls, st
 
 bool TReferenceAdapter::Adapt(TCIMValue& value) const
 {
-    switch (TAccess::GetForm(value)) {
-    case TAccess::kPath:
-        return AdaptPath(value);
-    case TAccess::kArray:
-    case TAccess::kBag:
-        return AdaptElements(value);
-    case TAccess::kObject:
-        return AdaptObject(value);
-    default:
-        return false;
-    }
+    return ChangeReferences(value, [this](TCIMValue& path) { return AdaptPath(path); });
 }
 
 bool TReferenceAdapter::AdaptPath(TCIMValue& value) const
@@ -141,53 +129,6 @@ bool TReferenceAdapter::AdaptPath(TCIMValue& value) const
         value = TCIMValue(MakePath(path, cls ? boost::shared_ptr<ICIMClass>(cls) : path.GetClass(), keys));
     }
     return isChanged;
-}
-
-bool TReferenceAdapter::AdaptElements(TCIMValue& value) const
-{
-    const auto mayRefer = [](const TCIMValue& element) {
-        return TAccess::GetForm(element) == TAccess::kPath || TAccess::GetForm(element) == TAccess::kObject;
-    };
-    const std::vector<TCIMValue>& stored = value.GetElements();
-    if (std::none_of(stored.begin(), stored.end(), mayRefer)) {
-        return false;
-    }
-    bool isChanged = false;
-    std::vector<TCIMValue> elements = stored;
-    for (TCIMValue& element : elements) {
-        isChanged = Adapt(element) || isChanged;
-    }
-    if (isChanged) {
-        const TCIMValue adapted(value.GetType(), static_cast<unsigned int>(elements.size()), elements);
-        value = value.IsBag() ? adapted.AsBag() : adapted;
-    }
-    return isChanged;
-}
-
-bool TReferenceAdapter::AdaptObject(TCIMValue& value) const
-{
-    const boost::shared_ptr<const TEmbeddedObject> object = value.GetEmbeddedObject();
-    std::vector<TEmbeddedObject::TProperty> properties = object->GetProperties();
-    bool isChanged = false;
-    for (TEmbeddedObject::TProperty& property : properties) {
-        isChanged = Adapt(property.value) || isChanged;
-    }
-    if (!isChanged) {
-        return false;
-    }
-    const auto adapted = boost::make_shared<TEmbeddedObject>(object->GetClassName(), object->IsClass());
-    adapted->SetSuperClassName(object->GetSuperClassName());
-    for (const TEmbeddedObject::TQualifier& qualifier : object->GetQualifiers()) {
-        adapted->AddQualifier(qualifier);
-    }
-    for (TEmbeddedObject::TProperty& property : properties) {
-        adapted->AddProperty(std::move(property));
-    }
-    for (const TEmbeddedObject::TMethod& method : object->GetMethods()) {
-        adapted->AddMethod(method);
-    }
-    value = TCIMValue(boost::shared_ptr<const TEmbeddedObject>(adapted));
-    return true;
 }
 
 void TReferenceAdapter::AdaptStatics(const TInMemClass& cls) const

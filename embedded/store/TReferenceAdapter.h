@@ -32,8 +32,6 @@ class CIMDELTA_INTERNAL_EXPORT TReferenceAdapter {
 
   private:
     bool AdaptPath(TCIMValue& value) const;
-    bool AdaptElements(TCIMValue& value) const;
-    bool AdaptObject(TCIMValue& value) const;
     void AdaptStatics(const TInMemClass& cls) const;
     bool AdaptInstances(TInMemClass& cls) const;
     bool AdaptInstance(TInMemInstance& instance, const std::vector<std::uint32_t>& slots) const;

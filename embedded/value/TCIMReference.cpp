@@ -225,6 +225,7 @@ void TCIMReference::SetNamespaceName(const std::string& name)
         place.ns.reset();
     }
     place.namespaceName = std::move(trimmed);
+    fContents->DropEmptyPlace();
 }
 
 const std::string& TCIMReference::GetHost() const
@@ -234,7 +235,9 @@ const std::string& TCIMReference::GetHost() const
 
 void TCIMReference::SetHost(const std::string& host)
 {
-    Own().OwnPlace().host = host;
+    TContents& contents = Own();
+    contents.OwnPlace().host = host;
+    contents.DropEmptyPlace();
 }
 
 const std::string& TCIMReference::GetClassName() const

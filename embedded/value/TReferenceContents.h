@@ -39,6 +39,14 @@ struct TCIMReference::TContents : TCounted {
         return *place;
     }
 
+    /// Gives the memory of a place back that says nothing.
+    void DropEmptyPlace() noexcept
+    {
+        if (place && place->namespaceName.empty() && place->host.empty() && place->ns.expired()) {
+            place.reset();
+        }
+    }
+
     /// How deep references are nested in `value`; 0 if there is none.
     static unsigned int GetDepth(const TCIMValue& value);
 
