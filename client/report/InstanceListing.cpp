@@ -84,11 +84,12 @@ std::string WriteDocuments(const TJson& documents, EOutputFormat format)
     return lines;
 }
 
-// The namespace that the file named. A copy must name it too: a reference in it that names a namespace may mean this one or
-// another, and a reader finds out only by this name.
+// The namespace that the file named, or that was found out from its references. A copy must name it: a reference in it that names a
+// namespace may mean this one or another, and a reader finds out only by this name.
 std::string NamespaceNameOf(const TInventory& inventory)
 {
-    return inventory.loaded.namesNamespace ? inventory.loaded.namespaceName : std::string();
+    const TLoadReport& loaded = inventory.loaded;
+    return loaded.namesNamespace || loaded.referencesNameNamespace ? loaded.namespaceName : std::string();
 }
 
 // Superclasses first, each once: a document declares a class before those below it.

@@ -139,6 +139,21 @@ void TCimXmlClassQueue::DeclareAll()
     }
 }
 
+void TCimXmlClassQueue::MakeDefaultsLocal()
+{
+    if (!fContext.GetOwnPlace().HasOpen()) {
+        return;
+    }
+    for (const TEntry& entry : fEntries) {
+        const boost::shared_ptr<TInMemClass> cls = fNamespace.FindClass(entry.draft.object.GetClassName());
+        for (const boost::shared_ptr<TInMemPropertyDecl>& decl : cls->GetLayout().GetOwnDecls()) {
+            TCIMValue value = decl->GetDefaultValue();
+            fContext.GetOwnPlace().MakeLocal(value);
+            decl->RewriteDefault(value);
+        }
+    }
+}
+
 void TCimXmlClassQueue::Refuse(const TCimXmlDraft& draft) const
 {
     const TCimXmlContext::TAt at(fContext, draft.place);

@@ -37,6 +37,9 @@ class CIMDELTA_INTERNAL_EXPORT TCimXmlClassQueue {
     /// never came, or which is below itself; those of TCimXmlClassMaker.
     void DeclareAll();
 
+    /// Takes the document's own namespace out of the references in default values. Call it after TCimXmlOwnPlace::Decide.
+    void MakeDefaultsLocal();
+
     /// How many classes have been declared.
     std::size_t CountDeclared() const noexcept { return fDeclared; }
     /// How often classes were looked at in order to declare them, for callers that bound the work.

@@ -1,8 +1,8 @@
 // One document, one namespace.
 //
 // A document may name its namespace several times: in each group, and in the name in front of each object. The first name counts,
-// and any other is an error, because objects of two namespaces would fall together in one. The same holds for the host. A document
-// that names none has the default of TLoadReport, and references to that default count as its own.
+// and any other is an error, because objects of two namespaces would fall together in one. The same holds for the host. What
+// a document does not name is the business of TCimXmlOwnPlace.
 #include "embedded/cimxml/TCimXmlContext.h"
 
 #include <algorithm>
@@ -68,48 +68,6 @@ void TCimXmlContext::NoteNamespace(const std::string& name, const std::string& h
         Fail(TZELStatusCode::kParseError,
              "found host " + Quote(host) + " after " + Quote(fReport.host) + "; a document comes from one host, so split this one");
     }
-}
-
-/// A host that is not named counts as the same, because many writers leave it out.
-bool TCimXmlContext::IsOwn(const std::string& name, const std::string& host) const
-{
-    if (!TNameText::Equal(name, fReport.namespaceName)) {
-        return false;
-    }
-    return host.empty() || fReport.host.empty() || TNameText::Equal(host, fReport.host);
-}
-
-void TCimXmlContext::MakeLocal(TCIMValue& value) const
-{
-    if (value.IsNull() || value.GetType().GetElementType() != TCIMValue::TCIMType::kReference) {
-        return;
-    }
-    if (!value.GetType().IsArray()) {
-        value = TCIMValue(MakeLocal(static_cast<TCIMReference>(value)));
-        return;
-    }
-    std::vector<TCIMValue> elements = value.GetElements();
-    for (TCIMValue& element : elements) {
-        MakeLocal(element);
-    }
-    value = TCIMValue(value.GetType(), static_cast<unsigned int>(elements.size()), elements);
-}
-
-TCIMReference TCimXmlContext::MakeLocal(const TCIMReference& path) const
-{
-    TCIMReference local(path);
-    path.EnumerateKeyBindings([&](std::pair<std::string, TCIMValue> key) {
-        if (key.second.GetType() == TCIMValue::TCIMType::kReference) {
-            MakeLocal(key.second);
-            local.AddKeyValue(key.first, key.second);
-        }
-        return true;
-    });
-    if (IsOwn(local.GetNamespaceName(), local.GetHost())) {
-        local.SetNamespaceName("");
-        local.SetHost("");
-    }
-    return local;
 }
 
 /// Other characters, such as a dot, a comma or a colon, could make two different paths read the same.

@@ -6,11 +6,11 @@
 #include <utility>
 #include <vector>
 
+#include "embedded/cimxml/TCimXmlOwnPlace.h"
 #include "embedded/cimxml/TLoadReport.h"
 #include "embedded/cimxml/TPopulateError.h"
 #include "embedded/cimxml/TTextPool.h"
 #include "host/Export.h"
-#include "host/TCIMReference.h"
 
 namespace NORVZEL20 {
 
@@ -63,13 +63,9 @@ class CIMDELTA_INTERNAL_EXPORT TCimXmlContext {
     /// Errors: fails with kParseError (9) for a namespace or a host that is not the first one.
     void NoteNamespace(const std::string& name, const std::string& host);
 
-    /// Whether a path with that namespace and host (may be empty) stays within the document's own namespace.
-    bool IsOwn(const std::string& name, const std::string& host) const;
-    /// Takes the document's own namespace and host out of a reference, out of the references in its keys and out of an array of
-    /// references. Call it for references that were written as text; TCimXmlPathReader does the same for all others.
-    void MakeLocal(TCIMValue& value) const;
-
     TLoadReport& GetReport() noexcept { return fReport; }
+    /// Decides which references stay within the document's own namespace.
+    TCimXmlOwnPlace& GetOwnPlace() noexcept { return fOwnPlace; }
     TTextPool& GetTexts() noexcept { return fTexts; }
 
     /// Call these two around the reading of an embedded object; messages then mention that they are about one. Errors: fails with
@@ -97,12 +93,11 @@ class CIMDELTA_INTERNAL_EXPORT TCimXmlContext {
     }
 
   private:
-    TCIMReference MakeLocal(const TCIMReference& path) const;
-
     std::string fFile;
     const TXmlReader* fReader = nullptr;
     TPlace fPlace;  // of the innermost TAt; line 0 if there is none
     TLoadReport fReport;
+    TCimXmlOwnPlace fOwnPlace{fReport};
     std::vector<const char*> fKinds;  // of the entries of fReport.tolerated
     TTextPool fTexts;
     std::size_t fEmbeddedDepth = 0;  // embedded objects that are being read, one inside of the other

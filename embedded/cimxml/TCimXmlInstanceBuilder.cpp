@@ -68,15 +68,15 @@ TCimXmlTarget TCimXmlInstanceBuilder::FindProperty(const char* name)
     return {&decl.GetName(), slot, decl.GetType(), fLayout->embedded[slot]};
 }
 
-void TCimXmlInstanceBuilder::SetProperty(const TCimXmlTarget& target, TCIMValue&& value, bool metUnknownClass)
+void TCimXmlInstanceBuilder::SetProperty(const TCimXmlTarget& target, TCIMValue&& value, bool isUnsettled)
 {
     if (value.GetType() != target.type) {
         value = Convert(target, value);
         // A reference that was text names a class that may be declared later.
-        metUnknownClass = metUnknownClass || target.type.GetElementType() == TCIMValue::TCIMType::kReference;
+        isUnsettled = isUnsettled || target.type.GetElementType() == TCIMValue::TCIMType::kReference;
     }
     fInstance->SetSlot(target.slot, std::move(value));
-    if (!metUnknownClass) {
+    if (!isUnsettled) {
         return;
     }
     fLate.NoteReference(fInstance, target.slot, fClasses.CountDeclared());
@@ -102,11 +102,12 @@ TCIMValue TCimXmlInstanceBuilder::Convert(const TCimXmlTarget& target, const TCI
     return converted;
 }
 
-/// References get the form that their classes declare, as far as they are declared, and lose the document's own namespace.
-void TCimXmlInstanceBuilder::Localize(TCIMValue& value) const
+/// References get the form that their classes declare, as far as they are declared, and lose the document's own namespace. Returns
+/// whether one of them is open (see TCimXmlOwnPlace).
+bool TCimXmlInstanceBuilder::Localize(TCIMValue& value) const
 {
     TReferenceAdapter(fNamespace).Adapt(value);
-    fContext.MakeLocal(value);
+    return fContext.GetOwnPlace().MakeLocal(value);
 }
 
 void TCimXmlInstanceBuilder::Fill(const TCimXmlDraft& draft, const TReadObjects& readObjects)
@@ -120,9 +121,8 @@ void TCimXmlInstanceBuilder::Fill(const TCimXmlDraft& draft, const TReadObjects&
         const TEmbeddedObject::TProperty& property = object.GetProperties()[index];
         const TCimXmlTarget target = FindProperty(property.name.c_str());
         TCIMValue value = target.isEmbedded ? readObjects(property.value) : property.value;
-        // All classes are declared now, so references get their final form at once.
-        Localize(value);
-        SetProperty(target, std::move(value), false);
+        const bool isOpen = Localize(value);
+        SetProperty(target, std::move(value), isOpen);
     }
 }
 

@@ -36,9 +36,9 @@ class TCimXmlInstanceBuilder {
     bool Begin(const char* className);
     /// Errors: kNotFound (15) if the class has no such property, kParseError (9) if the instance has had it already.
     TCimXmlTarget FindProperty(const char* name);
-    /// `metUnknownClass` says that the value refers to a class that is not declared yet. A value of another type is converted.
-    /// Errors: kTypeMismatch (13) if that would lose something.
-    void SetProperty(const TCimXmlTarget& target, TCIMValue&& value, bool metUnknownClass);
+    /// `isUnsettled` says that references in the value may have to be written again (see TCimXmlPathReader::TakeMetUnsettled). A
+    /// value of another type is converted. Errors: kTypeMismatch (13) if that would lose something.
+    void SetProperty(const TCimXmlTarget& target, TCIMValue&& value, bool isUnsettled);
     /// Begins the instance and sets all its properties. Call it for a draft when the document has ended. Errors: kNotFound (15) if
     /// its class is not declared; those of FindProperty and SetProperty.
     void Fill(const TCimXmlDraft& draft, const TReadObjects& readObjects);
@@ -51,7 +51,7 @@ class TCimXmlInstanceBuilder {
   private:
     TCimXmlLayout* FindLayout(const char* className);
     TCIMValue Convert(const TCimXmlTarget& target, const TCIMValue& value);
-    void Localize(TCIMValue& value) const;
+    bool Localize(TCIMValue& value) const;
     void FillKeys(const TOwnKeys& keys);
 
     TCimXmlContext& fContext;

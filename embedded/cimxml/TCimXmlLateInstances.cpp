@@ -1,30 +1,43 @@
-// What to do with instances that come before a class they need.
+// What to do with instances that come before something they need.
 //
 // 1. The class of the instance itself is not declared yet. Its properties have no types and no slots, so it waits as a draft until
 //    the document ends. All instances after it wait too; otherwise they would overtake it, and the namespace would not keep the
 //    document's order.
-// 2. The class is known, but a reference is to a class that is not. How a reference is written depends on that class (the spelling
-//    and the types of its keys), so it is noted and written again at the end. The instance is added meanwhile.
-// 3. As 2, but the reference is a key. Then the name of the instance itself depends on the other class, so the instance is held:
-//    filled, but added only after its references have been written again. Later instances of its class are held too, for the order.
+// 2. The class is known, but a reference is to a class that is not, or whether it stays in the document's own namespace is open.
+// How
+//    a reference is written depends on both, so it is noted and written again at the end. The instance is added meanwhile.
+// 3. As 2, but the reference is a key. Then the name of the instance itself may change, so the instance is held: filled, but added
+//    only after its references have been written again. Later instances of its class are held too, for the order.
 #include "embedded/cimxml/TCimXmlLateInstances.h"
 
 #include "embedded/store/TReferenceAdapter.h"
 
 namespace NORVZEL20 {
 
-void TCimXmlLateInstances::ResolveReferences(const TCimXmlContext& context, const TInMemNamespace& ns, std::size_t declared)
+void TCimXmlLateInstances::AdaptReferences(TCimXmlOwnPlace& place, const TInMemNamespace& ns, std::size_t declared)
 {
     if (declared == fDeclaredBefore) {
         return;  // what was not known then is not known now
     }
     const TReferenceAdapter adapter(ns);
-    for (const auto& [instance, slot] : std::exchange(fReferences, {})) {
+    for (const auto& [instance, slot] : fReferences) {
         TCIMValue value = instance->GetSlotValue(slot);
         if (adapter.Adapt(value)) {
-            context.MakeLocal(value);  // a key that was text may be a reference now
+            place.MakeLocal(value);  // a key that was text may be a reference now
             instance->SetSlot(slot, std::move(value));
         }
+    }
+}
+
+void TCimXmlLateInstances::MakeReferencesLocal(TCimXmlOwnPlace& place)
+{
+    if (!place.HasOpen()) {
+        return;
+    }
+    for (const auto& [instance, slot] : std::exchange(fReferences, {})) {
+        TCIMValue value = instance->GetSlotValue(slot);
+        place.MakeLocal(value);
+        instance->SetSlot(slot, std::move(value));
     }
 }
 

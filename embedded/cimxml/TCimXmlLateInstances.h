@@ -13,7 +13,7 @@
 
 namespace NORVZEL20 {
 
-/// Instances and references that need a class which the document declares only later. Plain storage: the loader works it off when
+/// Instances and references that need something which the document gives only later. Plain storage: the loader works it off when
 /// the document has ended.
 class TCimXmlLateInstances {
   public:
@@ -28,21 +28,23 @@ class TCimXmlLateInstances {
     bool IsWaiting() const noexcept { return fIsWaiting; }
     void Wait(TCimXmlDraft draft) { fDrafts.push_back(std::move(draft)); }
 
-    /// Holds an instance back, because one of its keys refers to a class that is not declared yet.
+    /// Holds an instance back, because a reference in one of its keys is noted too.
     void Hold(const boost::shared_ptr<TInMemInstance>& instance, const TCimXmlContext::TPlace& place)
     {
         fHeld.push_back({instance, place});
     }
 
-    /// Notes a property that refers to a class which is not declared yet. `declared` is how many classes are.
+    /// Notes a property with a reference that may have to be written again. `declared` is how many classes are declared.
     void NoteReference(const boost::shared_ptr<TInMemInstance>& instance, std::uint32_t slot, std::size_t declared)
     {
         fDeclaredBefore = fReferences.empty() ? declared : fDeclaredBefore;
         fReferences.emplace_back(instance, slot);
     }
     /// Writes the noted references again, with the keys as their classes declare them. `declared` is how many classes are declared
-    /// by now. Call it before TakeHeld.
-    void ResolveReferences(const TCimXmlContext& context, const TInMemNamespace& ns, std::size_t declared);
+    /// by now. Call it before `place` decides, so that it sees references that were text.
+    void AdaptReferences(TCimXmlOwnPlace& place, const TInMemNamespace& ns, std::size_t declared);
+    /// Takes the document's own namespace out of the noted references. Call it after `place` has decided, and before TakeHeld.
+    void MakeReferencesLocal(TCimXmlOwnPlace& place);
 
     /// Those that were held and those that waited, each once and in the document's order.
     std::vector<THeld> TakeHeld() noexcept { return std::exchange(fHeld, {}); }

@@ -6,8 +6,9 @@
 // 1. Classes wait in TCimXmlClassQueue until an instance needs them or the document ends.
 // 2. Instances of a declared class are filled by TCimXmlInstanceBuilder while they are read, and added at their end.
 // 3. Instances that need a class which has not come yet are kept in TCimXmlLateInstances.
-// 4. When the document has ended, Finish declares the remaining classes, writes the noted references again, adds the held instances
-//    and then those that waited as drafts. What is still missing then is an error.
+// 4. When the document has ended, Finish declares the remaining classes and fills the instances that waited as drafts. Then all
+//    references have been seen, so it is decided which are local; the noted ones are written again, and the held instances, to
+//    which those of the drafts belong by now, are added. What is still missing then is an error.
 #include "embedded/cimxml/TCimXmlLoader.h"
 
 #include <boost/smart_ptr/make_shared.hpp>
@@ -58,7 +59,7 @@ bool TCimXmlLoader::BeginInstance(const char* className)
 void TCimXmlLoader::EndInstance(const TOwnKeys* ownKeys)
 {
     const boost::shared_ptr<TInMemInstance> instance = fBuilder.Take(ownKeys);
-    if (fBuilder.IsHeld() && !fHasEnded) {
+    if (fBuilder.IsHeld() || fHasEnded) {
         fLate.Hold(instance, fContext.GetPlace());
     } else {
         Add(instance);
@@ -100,15 +101,18 @@ void TCimXmlLoader::Finish(const TReadObjects& readObjects)
 {
     fHasEnded = true;
     fClasses.DeclareAll();
-    fLate.ResolveReferences(fContext, *fNamespace, fClasses.CountDeclared());
-    for (const TCimXmlLateInstances::THeld& held : fLate.TakeHeld()) {
-        const TCimXmlContext::TAt at(fContext, held.place);
-        Add(held.instance);
-    }
+    fLate.AdaptReferences(fContext.GetOwnPlace(), *fNamespace, fClasses.CountDeclared());
     for (const TCimXmlDraft& draft : fLate.TakeDrafts()) {
         const TCimXmlContext::TAt at(fContext, draft.place);
         fBuilder.Fill(draft, readObjects);
         EndInstance(&draft.ownKeys);
+    }
+    fContext.GetOwnPlace().Decide();
+    fClasses.MakeDefaultsLocal();
+    fLate.MakeReferencesLocal(fContext.GetOwnPlace());
+    for (const TCimXmlLateInstances::THeld& held : fLate.TakeHeld()) {
+        const TCimXmlContext::TAt at(fContext, held.place);
+        Add(held.instance);
     }
 }
 

@@ -40,9 +40,9 @@ class CIMDELTA_INTERNAL_EXPORT TCimXmlLoader {
     /// SetProperty for each of its properties (see TCimXmlInstanceBuilder), then EndInstance.
     bool BeginInstance(const char* className);
     TCimXmlTarget FindProperty(const char* name) { return fBuilder.FindProperty(name); }
-    void SetProperty(const TCimXmlTarget& target, TCIMValue&& value, bool metUnknownClass)
+    void SetProperty(const TCimXmlTarget& target, TCIMValue&& value, bool isUnsettled)
     {
-        fBuilder.SetProperty(target, std::move(value), metUnknownClass);
+        fBuilder.SetProperty(target, std::move(value), isUnsettled);
     }
     /// `ownKeys` (may be null) gives the keys that the instance itself leaves out. Errors: kAlreadyExists (12) if an instance with
     /// these keys is there, kKeyMissing (14) if a key has no value.
@@ -73,7 +73,7 @@ class CIMDELTA_INTERNAL_EXPORT TCimXmlLoader {
     TCimXmlClassQueue fClasses;
     TCimXmlLateInstances fLate;
     TCimXmlInstanceBuilder fBuilder;
-    bool fHasEnded = false;  // the document: no class will come any more
+    bool fHasEnded = false;  // the document: instances are held until it is decided which references are local
     bool fKeep = false;
     std::vector<boost::shared_ptr<ICIMElement>> fKeptInstances;
 };

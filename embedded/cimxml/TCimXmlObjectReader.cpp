@@ -40,7 +40,7 @@ class TCimXmlObjectReader::TNested {
         return fReader.TakeObject();
     }
 
-    bool TakeMetUnknownClass() noexcept { return fReader.TakeMetUnknownClass(); }
+    bool TakeMetUnsettled() noexcept { return fReader.TakeMetUnsettled(); }
 
   private:
     TCimXmlContext& fContext;
@@ -68,8 +68,8 @@ TCIMValue TCimXmlObjectReader::Read(std::string_view text)
     }
     TCIMValue value(fNested->Read(text));
     fContext.LeaveEmbeddedObject();
-    if (fNested->TakeMetUnknownClass()) {
-        fPaths.NoteUnknownClass();
+    if (fNested->TakeMetUnsettled()) {
+        fPaths.NoteUnsettled();
     }
     return value;
 }

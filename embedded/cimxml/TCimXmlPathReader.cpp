@@ -11,8 +11,8 @@
 // document's own.
 //
 // Two paths to the same instance must read the same. So a path within the document's namespace is stored without one, and names and
-// types of keys are written as the class declares them. If the class is not declared yet, that happens later, when the loader is
-// notified by TakeMetUnknownClass.
+// types of keys are written as the class declares them. If the class or the document's namespace is not known yet, that happens
+// later: the loader asks for it with TakeMetUnsettled.
 #include "embedded/cimxml/TCimXmlPathReader.h"
 
 #include <cstring>
@@ -77,12 +77,9 @@ TCIMReference TCimXmlPathReader::End()
     } else {
         fContext.CheckName("class", frame.className);
         path.SetClassName(frame.className);
-        fMetUnknownClass = true;
+        fMetUnsettled = true;
     }
-    if (!frame.namespaceName.empty() && !fContext.IsOwn(frame.namespaceName, frame.host)) {
-        path.SetNamespaceName(frame.namespaceName);
-        path.SetHost(frame.host);
-    }
+    SetPlace(path, frame);
     for (const auto& [declared, value] : frame.keys) {
         std::string name = declared.empty() ? FindOnlyKey(cls.get()) : declared;
         TCIMValue adapted = value;
@@ -90,8 +87,8 @@ TCIMReference TCimXmlPathReader::End()
             fContext.CheckName("key", name);
         } else if (adapted.GetType() == TType::kReference && value.GetType() != TType::kReference) {
             TReferenceAdapter(*fNamespace).Adapt(adapted);
-            fContext.MakeLocal(adapted);
-            fMetUnknownClass = true;  // perhaps: the text names a class that may be declared later
+            fContext.GetOwnPlace().MakeLocal(adapted);
+            fMetUnsettled = true;  // perhaps: the text names a class that may be declared later
         }
         AddKeyTo(path, name, adapted);
     }
@@ -99,6 +96,20 @@ TCIMReference TCimXmlPathReader::End()
         fContext.Fail(EStatus::kParseError, "found a key a second time in one path, expected each once");
     }
     return path;
+}
+
+/// Gives the path the namespace and host that it is written with, unless they are the document's own.
+void TCimXmlPathReader::SetPlace(TCIMReference& path, const TFrame& frame)
+{
+    if (frame.namespaceName.empty()) {
+        return;
+    }
+    const TCimXmlOwnPlace::EAnswer answer = fContext.GetOwnPlace().Classify(frame.namespaceName, frame.host);
+    if (answer != TCimXmlOwnPlace::kOwn) {
+        path.SetNamespaceName(frame.namespaceName);
+        path.SetHost(frame.host);
+    }
+    fMetUnsettled = fMetUnsettled || answer == TCimXmlOwnPlace::kOpen;
 }
 
 void TCimXmlPathReader::AddKeyTo(TCIMReference& path, const std::string& name, const TCIMValue& value) const

@@ -16,10 +16,9 @@ namespace NORVZEL20 {
 
 /// Puts object paths together while their elements are read. A key may be a path itself, so paths nest.
 ///
-/// A path within the document's own namespace comes without a namespace. If the class is declared, a key value gets the declared
-/// type of its key, unless that would lose something.
-/// Errors: every operation fails through the context, with kParseError (9) if the path is not well-formed and kTypeMismatch (13) if
-/// a key's text is no value of its type.
+/// A path that is known to stay within the document's own namespace comes without a namespace. If the class is declared, a key
+/// value gets the declared type of its key, unless that would lose something. Errors: every operation fails through the context,
+/// with kParseError (9) if the path is not well-formed and kTypeMismatch (13) if a key's text is no value of its type.
 class TCimXmlPathReader {
   public:
     /// Classes are looked up in `ns` (may be null). `context` must outlive the reader.
@@ -52,10 +51,11 @@ class TCimXmlPathReader {
     /// Takes the document's namespace from the name in front of the object, if it has one.
     void NoteOwnNamespace();
 
-    /// Whether a path that has ended since the last call is to a class that is not declared.
-    bool TakeMetUnknownClass() noexcept { return std::exchange(fMetUnknownClass, false); }
+    /// Whether a path that has ended since the last call may have to be written again at the end of the document: its class is not
+    /// declared, or it is open (see TCimXmlOwnPlace).
+    bool TakeMetUnsettled() noexcept { return std::exchange(fMetUnsettled, false); }
     /// Reports such a path that another reader has read.
-    void NoteUnknownClass() noexcept { fMetUnknownClass = true; }
+    void NoteUnsettled() noexcept { fMetUnsettled = true; }
 
   private:
     struct TFrame {
@@ -69,6 +69,7 @@ class TCimXmlPathReader {
 
     boost::shared_ptr<TInMemClass> FindClass(const std::string& name);
     TCIMValue ReadKey(std::string_view text);
+    void SetPlace(TCIMReference& path, const TFrame& frame);
     void AddKeyTo(TCIMReference& path, const std::string& name, const TCIMValue& value) const;
     [[noreturn]] void FailTooDeep() const;
     const std::string& FindOnlyKey(const TInMemClass* cls) const;
@@ -82,7 +83,7 @@ class TCimXmlPathReader {
     std::string fHost;
     std::string fValueType;
     std::string fType;
-    bool fMetUnknownClass = false;
+    bool fMetUnsettled = false;
 };
 
 }  // namespace NORVZEL20

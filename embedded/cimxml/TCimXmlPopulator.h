@@ -20,8 +20,11 @@ namespace NORVZEL20 {
 /// even if the declaration comes later. There is one exception: a key value without a name needs its class in front of it.
 /// Names: those of classes, properties and keys consist of ASCII letters, digits, underscores and characters beyond ASCII, so they
 /// cannot be confused with the punctuation of a path.
-/// Values: a property that an instance does not mention is null, even if it has a default. A reference without a namespace, or to
-/// the document's own namespace (and host), is stored without one; letter case, and slashes at both ends of the name, do not count.
+/// Values: a property that an instance does not mention is null, even if it has a default.
+/// References: one without a namespace, or to the document's own namespace and host, is stored without both; letter case, and
+/// slashes at both ends of the name, do not count. If the document names no namespace, its own is the one that all its references
+/// name, otherwise root/cimv2. If it names no host, its own is the one that its references name beside that namespace; if they
+/// name several, none is its own, and all are kept. A reference that names no host is to the own one.
 /// All or nothing: if a load throws, the namespace is as it was.
 /// Errors of every load: TPopulateError with the statuses of TNamespacePopulator::PopulateFromXMLFile, or kNotSupported (31) if the
 /// namespace is not one of the provider "inmem"; std::bad_alloc. Nothing is logged.

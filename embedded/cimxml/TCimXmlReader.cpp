@@ -247,6 +247,7 @@ void TCimXmlReader::BeginInstance(const TCimXmlAttributes& attributes)
     NoteObject();
     const char* name = attributes.Require("CLASSNAME");
     fIsDirect = fLoader != nullptr && fLoader->BeginInstance(name);
+    fPaths.TakeMetUnsettled();  // what was read in front of the instance is none of its properties
     if (!fIsDirect) {
         fDraft.BeginInstance(name);
     }
@@ -326,7 +327,7 @@ void TCimXmlReader::EndProperty()
     }
     // A new instance has nulls already.
     if (!fProperty.IsNull()) {
-        fLoader->SetProperty(fTarget, fProperty.Take(), fPaths.TakeMetUnknownClass());
+        fLoader->SetProperty(fTarget, fProperty.Take(), fPaths.TakeMetUnsettled());
     }
 }
 

@@ -35,8 +35,8 @@ class TCimXmlReader : public TXmlReader::ISink {
     void Reset();
     /// The embedded object that was read; null if the document did not end. Each is returned once.
     boost::shared_ptr<const TEmbeddedObject> TakeObject() noexcept;
-    /// Whether a reference was to a class that is not declared, since this was last asked.
-    bool TakeMetUnknownClass() noexcept { return fPaths.TakeMetUnknownClass(); }
+    /// See TCimXmlPathReader::TakeMetUnsettled.
+    bool TakeMetUnsettled() noexcept { return fPaths.TakeMetUnsettled(); }
     /// For values that turn out to be embedded objects only when their class is declared.
     TCimXmlObjectReader& GetObjects() noexcept { return fObjects; }
 

@@ -15,9 +15,11 @@ struct TLoadReport {
         std::size_t count;  ///< how many of this kind there were
     };
 
-    std::string namespaceName = "root/cimv2";  ///< the namespace that the document names; this default if it names none
-    bool namesNamespace = false;               ///< whether the document names its namespace
-    std::string host;                          ///< the host beside that namespace; empty if none is named
+    /// The namespace that the document names; if it names none, the one that all its references name, otherwise this default.
+    std::string namespaceName = "root/cimv2";
+    bool namesNamespace = false;           ///< whether the document names its namespace
+    bool referencesNameNamespace = false;  ///< whether namespace or host had to be found out from the references
+    std::string host;                      ///< the host beside that namespace; empty if none is named
     std::size_t qualifierDecls = 0;
     std::size_t classes = 0;
     std::size_t instances = 0;

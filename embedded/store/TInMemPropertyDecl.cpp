@@ -83,6 +83,15 @@ TCIMValue TInMemPropertyDecl::WithoutClasses(TCIMValue value)
     return value.IsBag() ? copy.AsBag() : copy;
 }
 
+void TInMemPropertyDecl::RewriteDefault(const TCIMValue& value)
+{
+    const bool isStillDefault = fStaticProperty.GetValue() == fDefault;
+    fDefault = WithoutClasses(value);
+    if (isStillDefault) {
+        fStaticProperty.SetState({fDefault, TCIMValue()});
+    }
+}
+
 void TInMemPropertyDecl::SetSpelling(const std::string& name)
 {
     if (!TNameText::Equal(name, fName)) {

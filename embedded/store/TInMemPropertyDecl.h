@@ -52,6 +52,10 @@ class CIMDELTA_EXPORT TInMemPropertyDecl : public TInMemNamedElement<ICIMPropert
     /// one of them owned the class, neither would ever be released.
     static TCIMValue WithoutClasses(TCIMValue value);
 
+    /// Writes the default another way, such as a reference without its namespace. A static property that still has the default gets
+    /// the new one. `value` must be of the declared type.
+    void RewriteDefault(const TCIMValue& value);
+
     /// Spells the name another way. Errors: kInvalidParameter (5) if more than letter case differs.
     void SetSpelling(const std::string& name);
 

@@ -57,6 +57,29 @@ TEST_F(WholeCopyTest, AReferenceToAnotherHostStaysOne)
     EXPECT_EQ("Disk.Id=\"1\"\n    Id: 1\n    R: //there/root/cimv2:Disk.Id=\"9\"\n", Result({"show", original, "Disk"}));
 }
 
+TEST_F(WholeCopyTest, ANamespaceThatOnlyReferencesNameIsNamed)
+{
+    const auto disks = [](const std::string& first, const std::string& second) {
+        return Document(Class("Disk", "", KeyProperty("Id") + "<PROPERTY.REFERENCE NAME=\"R\"/>") +
+                        Instance("Disk", Value("Id", "1") + first) + Instance("Disk", Value("Id", "2") + second) + System());
+    };
+    EXPECT_EQ(kEqual, CompareWithCopy(disks(Reference("", "cimv2"), Reference("", "interop"))));
+    EXPECT_EQ(kEqual, CompareWithCopy(disks(Reference("here", "interop"), Reference("there", "interop"))));
+    EXPECT_EQ(kEqual, CompareWithCopy(disks(Reference("", "interop"), Reference("", "interop"))));
+}
+
+TEST_F(WholeCopyTest, ReferencesToTwoHostsThatAreExchangedDiffer)
+{
+    const auto disks = [](const std::string& first, const std::string& second) {
+        return Document(Class("Disk", "", KeyProperty("Id") + "<PROPERTY.REFERENCE NAME=\"R\"/>") +
+                        Instance("Disk", Value("Id", "1") + Reference(first, "cimv2")) +
+                        Instance("Disk", Value("Id", "2") + Reference(second, "cimv2")) + System());
+    };
+    const std::string report = Compare(disks("h1", "h2"), disks("h2", "h1"));
+    EXPECT_EQ("2 differences between a and b: 2 changed values in 2 instances", report.substr(0, report.find('\n')));
+    EXPECT_EQ(kEqual, CompareWithCopy(disks("h1", "h2")));
+}
+
 TEST_F(WholeCopyTest, ObjectsBesidePlainTextInAnArrayAreObjectsAgain)
 {
     const std::string object = "<VALUE><![CDATA[<INSTANCE CLASSNAME=\"Foo\"></INSTANCE>]]></VALUE>";

@@ -147,7 +147,7 @@ TEST_F(PopulatorTest, ReferencesWrittenAsTextAreStoredLikeAllOthers)
     }
 }
 
-TEST_F(PopulatorTest, WithoutANameTheNamespaceIsTheDefaultAndAnyHostItsOwn)
+TEST_F(PopulatorTest, WithoutANameTheNamespaceIsTheDefaultAndTheOnlyHostItsOwn)
 {
     const TLoadReport report = fLoading.Load(
         L::Group(L::Class("A", kReferenceR) +

@@ -9,12 +9,20 @@ TLoading::TLoading() : fNamespace(TInMemNamespace::Create("root/cimv2")) {}
 
 TLoadReport TLoading::Load(const std::string& document)
 {
-    return TCimXmlPopulator(fNamespace).LoadFromMemory(document.data(), document.size(), "doc.xml");
+    return Keep(TCimXmlPopulator(fNamespace).LoadFromMemory(document.data(), document.size(), "doc.xml"));
 }
 
 TLoadReport TLoading::LoadFile(const std::string& path)
 {
-    return TCimXmlPopulator(fNamespace).LoadFile(path);
+    return Keep(TCimXmlPopulator(fNamespace).LoadFile(path));
+}
+
+TLoadReport TLoading::Keep(TLoadReport report)
+{
+    if (report.namesNamespace || report.referencesNameNamespace) {
+        fName = report.namespaceName;
+    }
+    return report;
 }
 
 std::string TLoading::ErrorOf(const std::string& document)
@@ -62,7 +70,7 @@ std::string TLoading::Write() const
 {
     std::string text;
     TCimXmlWriter writer([&](std::string_view piece) { text += piece; });
-    writer.WriteNamespace(*fNamespace);
+    writer.WriteNamespace(*fNamespace, fName);
     return text;
 }
 

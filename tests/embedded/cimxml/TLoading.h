@@ -26,7 +26,7 @@ class TLoading {
     boost::shared_ptr<ICIMInstance> Find(const std::string& path) const;
     /// The paths of the instances of a class, a line for each.
     std::string PathsOf(const std::string& className) const;
-    /// The whole namespace as CIM-XML.
+    /// The whole namespace as CIM-XML. It names the namespace that was known of the last document.
     std::string Write() const;
 
     const boost::shared_ptr<TInMemNamespace>& GetNamespace() const { return fNamespace; }
@@ -42,7 +42,10 @@ class TLoading {
     static std::string Tolerated(const TLoadReport& report);
 
   private:
+    TLoadReport Keep(TLoadReport report);
+
     boost::shared_ptr<TInMemNamespace> fNamespace;
+    std::string fName;
 };
 
 }  // namespace NORVZEL20

@@ -1,0 +1,86 @@
+// The document's own namespace and host.
+//
+// A reference into the namespace that it stands in is stored without that namespace, so two inventories are equal if only the name
+// of their namespace or host differs. Which namespace that is, the document may say itself, before its first object, in the middle
+// or never; and it may name the namespace without the host. What it does not say follows from its references:
+//
+//     namespace   the one that all of them name, otherwise root/cimv2
+//     host        the one that all of those name which name one beside that namespace; if they name several, none is known to be
+//                 the own one, and all stay in the paths
+//
+// A document is read once, so both are known only at its end. Until then such references are open: they are stored as they are
+// written, and written again after Decide. A reference without a namespace is never open, and neither is one without a host in a
+// document that names its namespace first.
+#include "embedded/cimxml/TCimXmlOwnPlace.h"
+
+#include "embedded/value/ChangeReferences.h"
+
+namespace NORVZEL20 {
+
+TCimXmlOwnPlace::EAnswer TCimXmlOwnPlace::Classify(const std::string& name, const std::string& host)
+{
+    const bool isOwnName = TNameText::Equal(name, fReport.namespaceName);
+    if (fIsDecided || fReport.namesNamespace) {
+        if (!isOwnName) {
+            return kForeign;
+        }
+        if (host.empty() || fIsAnyHostOwn) {
+            return kOwn;
+        }
+        if (fIsDecided || !fReport.host.empty()) {
+            return TNameText::Equal(host, fReport.host) ? kOwn : kForeign;
+        }
+    }
+    THosts& hosts = fNamed[name];
+    if (hosts.first.empty()) {
+        hosts.first = host;
+    }
+    hosts.areSeveral = hosts.areSeveral || (!host.empty() && !TNameText::Equal(host, hosts.first));
+    return kOpen;
+}
+
+bool TCimXmlOwnPlace::MakeLocal(TCIMValue& value)
+{
+    bool isOpen = false;
+    ChangeReferences(value, [&](TCIMValue& path) { return MakePathLocal(path, isOpen); });
+    return isOpen;
+}
+
+/// Returns whether the path changed.
+bool TCimXmlOwnPlace::MakePathLocal(TCIMValue& value, bool& isOpen)
+{
+    const TCIMReference path = value;
+    TCIMReference local(path);
+    bool isChanged = false;
+    path.EnumerateKeyBindings([&](std::pair<std::string, TCIMValue> key) {
+        if (ChangeReferences(key.second, [&](TCIMValue& inner) { return MakePathLocal(inner, isOpen); })) {
+            local.AddKeyValue(key.first, key.second);
+            isChanged = true;
+        }
+        return true;
+    });
+    const EAnswer answer = path.GetNamespaceName().empty() ? kForeign : Classify(path.GetNamespaceName(), path.GetHost());
+    if (answer == kOwn) {
+        local.SetNamespaceName("");
+        local.SetHost("");
+        isChanged = true;
+    }
+    isOpen = isOpen || answer == kOpen;
+    if (isChanged) {
+        value = TCIMValue(local);
+    }
+    return isChanged;
+}
+
+void TCimXmlOwnPlace::Decide()
+{
+    fReport.referencesNameNamespace = HasOpen();
+    if (!fReport.namesNamespace && fNamed.size() == 1) {
+        fReport.namespaceName = fNamed.begin()->first;
+    }
+    const auto own = fNamed.find(fReport.namespaceName);
+    fIsAnyHostOwn = fReport.host.empty() && own != fNamed.end() && !own->second.areSeveral;
+    fIsDecided = true;
+}
+
+}  // namespace NORVZEL20
