@@ -8,6 +8,8 @@
 #include "client/comparison/TFaultSearch.h"
 #include "client/inventory/CollectObjects.h"
 #include "client/inventory/PropertyValue.h"
+#include "embedded/value/TTypeKind.h"
+#include "embedded/value/TValueText.h"
 #include "host/TZELException.h"
 #include "provider/DeltaNames.h"
 
@@ -29,6 +31,18 @@ bool HasUsableType(TInMemClass& systems)
     }
 }
 
+// What is wrong with the declaration, if no value of it could be used.
+std::string DescribeUnusableType(const TInMemClass& systems)
+{
+    const boost::shared_ptr<TInMemPropertyDecl> decl = systems.FindPropertyDecl(kOperatingSystemType);
+    if (!decl) {
+        return std::string("; the class declares no ") + kOperatingSystemType;
+    }
+    return TTypeKind::IsInteger(decl->GetType())
+               ? std::string()
+               : "; the class declares it as " + TValueText::DescribeType(decl->GetType()) + ", not as an integer";
+}
+
 // The cause of kInitializationFailed (3): the first inventory that lacks what the plug-in requires of it.
 TCause FindSystemTrouble(const std::vector<TInventory>& inventories)
 {
@@ -45,7 +59,7 @@ TCause FindSystemTrouble(const std::vector<TInventory>& inventories)
         return {"the inventories are as they should be; perhaps there was not enough memory", false};
     }
     return {"the first " + std::string(kOperatingSystemClass) + " of " + inventories[0].path + " has no " + kOperatingSystemType +
-                " between 0 and 65535",
+                " between 0 and 65535" + DescribeUnusableType(*systems),
             false};
 }
 

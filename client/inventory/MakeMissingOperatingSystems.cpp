@@ -4,7 +4,8 @@
 // it can read. Few inventories have one, because it is not a standard class; so the client makes what is missing:
 //   the class       as the first inventory that has it declares it; if none does, with the key Name alone
 //   OSType          is added to the class if it lacks one
-//   the instance    Name and OSType of the standard class's instance, as far as it has them with the usual types
+//   the instance    Name and OSType of the standard class's instance, as far as it has a text and an integer from 0 to 65535 there;
+//                   OSType in the type that the class declares, if that is an integer type
 //   other keys      any value of their type, because a key must not be null
 // If the client also makes the rules, they exclude the class: what the client has made says nothing about the systems.
 #include "client/inventory/MakeMissingOperatingSystems.h"
@@ -16,6 +17,7 @@
 #include "client/inventory/PropertyValue.h"
 #include "client/process/TClientError.h"
 #include "embedded/store/TSchemaCopier.h"
+#include "embedded/value/TTypeKind.h"
 #include "embedded/value/TValueText.h"
 #include "host/TCIMDateTime.h"
 #include "host/TZELException.h"
@@ -32,7 +34,7 @@ const char kKeyQualifier[] = "Key";
 // What the new instance says about the system.
 struct TSystem {
     TCIMValue name = TCIMValue("unknown");
-    std::uint64_t type = 0;
+    TCIMValue type = TCIMValue(static_cast<unsigned short>(0));
 };
 
 TCIMValue FindValue(const ICIMInstance& instance, const char* property)
@@ -72,8 +74,8 @@ TSystem ReadStandardInstance(TInMemNamespace& ns)
         system.name = name;
     }
     const TCIMValue type = FindValue(*instance, kOperatingSystemType);
-    if (!type.IsNull() && type.GetType() == TCIMValue::TCIMType::kUint16) {
-        system.type = type.GetUnsigned();
+    if (!type.IsNull() && TTypeKind::IsInteger(type.GetType())) {
+        TValueText::Convert(type, TCIMValue::TCIMType::kUint16, system.type);  // stays 0 if it is out of range
     }
     return system;
 }
@@ -201,6 +203,19 @@ void AddTypeProperty(const TInventory& inventory, TInMemClass& cls)
     AddProperty(*inventory.ns, cls, kOperatingSystemType, TCIMValue::TCIMType::kUint16, false);
 }
 
+// A type that is no integer cannot hold any OSType. If the inventory is the reference, the run reports that.
+void SetType(TInMemInstance& instance, const TCIMValue& type)
+{
+    const TInMemLayout& layout = instance.GetInMemClass()->GetLayout();
+    const std::uint32_t slot = layout.FindSlot(kOperatingSystemType);
+    const TCIMValue::TCIMType declared = layout.GetDecl(slot).GetType();
+    if (TTypeKind::IsInteger(declared)) {
+        TCIMValue fitting = SomeValue(declared, std::string());
+        TValueText::Convert(type, declared, fitting);  // stays 0 if the declared type cannot hold it
+        instance.SetSlot(slot, fitting);
+    }
+}
+
 void AddInstance(const TInventory& inventory, TInMemClass& cls)
 {
     TInMemNamespace& ns = *inventory.ns;
@@ -220,10 +235,7 @@ void AddInstance(const TInventory& inventory, TInMemClass& cls)
     if (name != TInMemLayout::kNoSlot && cls.GetLayout().GetDecl(name).GetType() == TCIMValue::TCIMType::kString) {
         instance->SetSlot(name, system.name);
     }
-    const std::uint32_t type = cls.GetLayout().FindSlot(kOperatingSystemType);
-    if (cls.GetLayout().GetDecl(type).GetType() == TCIMValue::TCIMType::kUint16) {
-        instance->SetSlot(type, TCIMValue(static_cast<unsigned short>(system.type)));
-    }
+    SetType(*instance, system.type);
     instance->AddToNamespace(TCallContext());
 }
 

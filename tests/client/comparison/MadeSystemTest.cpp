@@ -38,6 +38,8 @@ class MadeSystemTest : public TPairFixture {
         return report;
     }
 
+    static std::string FirstLine(const std::string& report) { return report.substr(0, report.find('\n')); }
+
     std::string Including()
     {
         return Scratch("rules", "<DifftoolSpec><class name='KALMO_OperatingSystem' default='include'/></DifftoolSpec>");
@@ -125,6 +127,23 @@ TEST_F(MadeSystemTest, ExplainSaysThatRulesDoNotReachIt)
                                      .find("\n  not compared at all, since cimdelta made the instance of c.xml\n"))
         << fOut;
     EXPECT_EQ(std::string::npos, explain("KALMO_OperatingSystem", {fFirst, fSecond}).find("cimdelta made")) << fOut;
+}
+
+TEST_F(MadeSystemTest, OneThatIsMadeForTheReferenceHasTheTypeThatAnotherDeclares)
+{
+    const auto declaring = [](const std::string& type) {
+        return Document(Class("KALMO_OperatingSystem", "", KeyProperty("Name") + Declaration("OSType", type)));
+    };
+    const std::string none = Document(Class("Disk", "", KeyProperty("Id")) + Instance("Disk", Value("Id", "1")));
+    EXPECT_EQ("1 difference between a and b: 1 instance only in a", FirstLine(Compare(none, declaring("uint32"))));
+    EXPECT_EQ("1 difference between a and b: 1 instance only in b", FirstLine(Compare(declaring("uint32"), none)));
+    EXPECT_EQ("1 difference between a and b: 1 instance only in b", FirstLine(Compare(declaring("uint16"), none)));
+    EXPECT_NE(std::string::npos,
+              Compare(none, declaring("string"))
+                  .find("cimdelta: the comparison failed: TCIMDiffEngine: Failed to get all properties to check Schema match; "
+                        "the first KALMO_OperatingSystem of a.xml has no OSType between 0 and 65535; the class declares it as "
+                        "string, not as "
+                        "an integer\n"));
 }
 
 TEST_F(MadeSystemTest, DifferencesOfOtherClassesStay)

@@ -1,6 +1,8 @@
+#include "client/inventory/CollectObjects.h"
 #include "client/inventory/MakeMissingOperatingSystems.h"
 #include "client/inventory/PropertyValue.h"
 #include "client/inventory/TInventoryLoader.h"
+#include "embedded/value/TValueText.h"
 #include "tests/client/TFakeConsole.h"
 #include "tests/client/TPairFixture.h"
 
@@ -165,6 +167,35 @@ TEST_F(SchemaNotesTest, AnOperatingSystemIsMadeAfterTheStandardOneWithTheSmalles
                 },
                 false, TCallContext());
         EXPECT_EQ(row.expected, made);
+    }
+}
+
+TEST_F(SchemaNotesTest, AnOperatingSystemIsMadeWithTheTypesThatAreDeclared)
+{
+    const struct {
+        const char* standard;  // the type of OSType in CIM_OperatingSystem
+        const char* value;     // there
+        const char* declared;  // the type of OSType in KALMO_OperatingSystem
+        const char* made;
+    } rows[] = {
+        {"uint16", "36", "uint8", "36"},     {"uint16", "36", "sint8", "36"},    {"uint16", "36", "uint16", "36"},
+        {"uint16", "36", "sint16", "36"},    {"uint16", "36", "uint32", "36"},   {"uint16", "36", "sint32", "36"},
+        {"uint16", "36", "uint64", "36"},    {"uint16", "36", "sint64", "36"},   {"sint64", "36", "uint16", "36"},
+        {"uint16", "300", "uint8", "0"},     {"uint32", "65536", "uint32", "0"}, {"sint32", "-1", "sint32", "0"},
+        {"string", "36", "uint16", "0"},     {"uint16", "36", "string", "NULL"}, {"uint16", "36", "real32", "NULL"},
+        {"uint16", "36", "boolean", "NULL"},
+    };
+    for (const auto& row : rows) {
+        TFakeConsole console;
+        std::vector<TInventory> inventories = TInventoryLoader(console).Load({Scratch(
+            "a.xml", Document(Class("CIM_OperatingSystem", "", KeyProperty("Name") + Declaration("OSType", row.standard)) +
+                              Instance("CIM_OperatingSystem", Value("Name", "x") + Value("OSType", row.value, row.standard)) +
+                              Class("KALMO_OperatingSystem", "", KeyProperty("Name") + Declaration("OSType", row.declared))))});
+        ASSERT_EQ(1U, MakeMissingOperatingSystems(inventories).size());
+        const boost::shared_ptr<TInMemClass> systems = inventories[0].ns->FindClass("KALMO_OperatingSystem");
+        const TCIMValue made = ValueOf(*InstancesOf(*systems).at(0), "OSType");
+        EXPECT_EQ(row.made, made.ToText()) << row.standard << " " << row.value << " " << row.declared;
+        EXPECT_EQ(row.declared, TValueText::DescribeType(made.GetType()));
     }
 }
 
