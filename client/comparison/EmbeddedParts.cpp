@@ -11,6 +11,7 @@
 #include "client/comparison/EmbeddedParts.h"
 
 #include <algorithm>
+#include <functional>
 #include <set>
 
 #include "embedded/value/TEmbeddedObject.h"
@@ -75,16 +76,10 @@ TCIMValue ValueIn(const TEmbeddedObject& object, const std::string& name, const 
     return TCIMValue();
 }
 
-void AddToGroups(std::vector<TValueDifference::TGroup>& groups, const TValueDifference::TGroup& holders, const TCIMValue& value)
+void AddToGroup(TValueDifference::TGroup& group, const TValueDifference::TGroup& holders)
 {
-    auto found = std::find_if(groups.begin(), groups.end(),
-                              [&value](const TValueDifference::TGroup& group) { return group.value == value; });
-    if (found == groups.end()) {
-        groups.push_back({{}, {}, value});
-        found = groups.end() - 1;
-    }
     for (std::size_t i = 0; i < holders.inventories.size(); ++i) {
-        found->Add(holders.inventories[i], holders.instances[i]);
+        group.Add(holders.inventories[i], holders.instances[i]);
     }
 }
 
@@ -100,10 +95,10 @@ TValueDifference PartOf(const TValueDifference& whole, const std::string& name, 
     for (std::size_t i = 0; i < whole.others.size(); ++i) {
         const TCIMValue value = ValueIn(*objects[i + (hasReference ? 1 : 0)], name, objects);
         if (!hasReference || part.reference != value) {
-            AddToGroups(part.others, whole.others[i], value);
+            AddToGroup(part.GetGroup(value, std::equal_to<TCIMValue>()), whole.others[i]);
         }
     }
-    if (!hasReference && part.others.size() == 1) {
+    if (!hasReference && !part.DoOthersDiffer(std::equal_to<TCIMValue>())) {
         part.others.clear();
     }
     return part;

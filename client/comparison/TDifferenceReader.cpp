@@ -164,7 +164,7 @@ void TDifferenceReader::AddChange(TDifference& difference, const ICIMInstance& r
         for (const boost::shared_ptr<ICIMInstance>& instance : instances) {
             const TCIMValue value = ValueBefore(*instance, difference.property);
             if (instances.size() == 1 || fRules.Differ(fClassName, change.reference, value)) {
-                AddToGroups(change.others, inventory, value);
+                change.GetGroup(value, MakeEqual()).Add(inventory, 1);
             }
         }
     }
@@ -184,25 +184,18 @@ void TDifferenceReader::AddDisagreements(TDifference& difference)
         TValueDifference values;
         values.property = fProperties[i];
         for (const auto& [inventory, instance] : instances) {
-            AddToGroups(values.others, inventory, ValueIfDeclared(*instance, values.property));
+            values.GetGroup(ValueIfDeclared(*instance, values.property), MakeEqual()).Add(inventory, 1);
         }
-        if (values.others.size() > 1) {
+        if (values.DoOthersDiffer(MakeEqual())) {
             AddEmbeddedParts(values, false);
             difference.values.push_back(values);
         }
     }
 }
 
-void TDifferenceReader::AddToGroups(std::vector<TValueDifference::TGroup>& groups, std::size_t inventory, const TCIMValue& value)
+TValueDifference::TEqual TDifferenceReader::MakeEqual() const
 {
-    auto group = std::find_if(groups.begin(), groups.end(), [&](const TValueDifference::TGroup& candidate) {
-        return !fRules.Differ(fClassName, candidate.value, value);
-    });
-    if (group == groups.end()) {
-        groups.push_back({{}, {}, value});
-        group = groups.end() - 1;
-    }
-    group->Add(inventory, 1);
+    return [this](const TCIMValue& one, const TCIMValue& other) { return !fRules.Differ(fClassName, one, other); };
 }
 
 // The reference lacks the instance of an added key. After a run with two inventories it has a copy, which does not count.

@@ -31,7 +31,7 @@ class TDifferenceReader {
     void AddKeys(TDifference& difference, const ICIMInstance& instance) const;
     void AddChange(TDifference& difference, const ICIMInstance& reference);
     void AddDisagreements(TDifference& difference);
-    void AddToGroups(std::vector<TValueDifference::TGroup>& groups, std::size_t inventory, const TCIMValue& value);
+    TValueDifference::TEqual MakeEqual() const;
     void CountSharing(TDifference& difference);
 
     const std::vector<TInventory>& fInventories;
