@@ -18,7 +18,7 @@ struct TComparisonReport {
         std::size_t onlyInOthers = 0;
         std::size_t changedValues = 0;
         std::size_t changedInstances = 0;       ///< the instances that the changed values belong to
-        std::size_t instancesOnlyInOthers = 0;  ///< more than onlyInOthers if instances of one inventory share a key
+        std::size_t instancesOnlyInOthers = 0;  ///< the sum of CountInstances of those that onlyInOthers counts
 
         std::size_t GetTotal() const { return onlyInReference + onlyInOthers + changedValues; }
     };

@@ -73,7 +73,10 @@ std::string TTextFormat::Kinds(const TComparisonReport::TCounts& counts) const
                         (IsPair() ? " only in " + Labels({0}) : " of " + Labels({0}) + " missing elsewhere"));
     }
     if (counts.onlyInOthers > 0) {
-        kinds.push_back(Counted(counts.instancesOnlyInOthers, "instance") + " only " + (IsPair() ? "in " + Others() : "elsewhere"));
+        // Instances that share a key are one difference.
+        const bool sharesKeys = counts.instancesOnlyInOthers > counts.onlyInOthers;
+        kinds.push_back(Counted(counts.onlyInOthers, sharesKeys ? "key" : "instance") + " only " +
+                        (IsPair() ? "in " + Others() : "elsewhere"));
     }
     if (counts.changedValues > 0) {
         kinds.push_back(Counted(counts.changedValues, "changed value") + " in " + Counted(counts.changedInstances, "instance"));

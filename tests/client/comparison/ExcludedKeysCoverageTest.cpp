@@ -136,7 +136,7 @@ TEST_F(ExcludedKeysCoverageTest, LaterInstancesOfAnotherInventoryAreComparedWith
 
 TEST_F(ExcludedKeysCoverageTest, LaterInstancesWithoutAPartnerAreNotSaidToBeCompared)
 {
-    EXPECT_EQ("1 difference between a and b: 3 instances only in b\n"
+    EXPECT_EQ("1 difference between a and b: 1 key only in b\n"
               "Instances of Disk with the key of an earlier one, since the rules leave out Slot: 1 of b, compared with the same "
               "instance of a as the earlier one; 2 of b, reported with the earlier one, since a has none with that key.\n"
               "not everything of 2 and 6\n"

@@ -82,16 +82,15 @@ TEST_F(SharedKeyTest, OfSeveralInventoriesAPathStandsBehindThoseThatLackIt)
               Differences({Declared() + OfSize("1", "5"), Declared(), Declared() + OfSize("2", "5")}));
 }
 
-TEST_F(SharedKeyTest, InstancesThatTheReferenceLacksAreAllCounted)
+TEST_F(SharedKeyTest, InstancesThatTheReferenceLacksAreAllNamed)
 {
     const std::string two = Declared() + OfSize("1", "5") + OfSize("2", "6");
-    EXPECT_EQ("1 difference between a and b: 2 instances only in b", Headline({Declared(), two}));
+    EXPECT_EQ("1 difference between a and b: 1 key only in b", Headline({Declared(), two}));
     EXPECT_EQ("Disk\n"
               "+ Id=\"sda\"  (2 instances of b with this key)\n"
               "    Size: 5 (one of 2 with this key) / 6 (one of 2 with this key)\n",
               Differences({Declared(), two}));
-    EXPECT_EQ("1 difference between a and b, c: 2 instances only elsewhere",
-              Headline({Declared(), two, Declared() + OfSize("3", "6")}));
+    EXPECT_EQ("1 difference between a and b, c: 1 key only elsewhere", Headline({Declared(), two, Declared() + OfSize("3", "6")}));
     EXPECT_EQ("Disk\n"
               "+ Id=\"sda\"  (in b, c; 2 instances of b with this key)\n"
               "    Size: b: 5 (one of 2 of b with this key) / b, c: 6 (one of 2 of b with this key)\n",
@@ -102,7 +101,39 @@ TEST_F(SharedKeyTest, InstancesThatTheReferenceLacksAreAllCounted)
         "\"others\":[{\"inventories\":[\"b\"],\"type\":\"uint32\",\"value\":5,\"sharing\":[{\"inventory\":\"b\",\"instances\":1}]},"
         "{\"inventories\":[\"b\"],\"type\":\"uint32\",\"value\":6,\"sharing\":[{\"inventory\":\"b\",\"instances\":1}]}]}]}\n",
         Lines({Declared(), two}));
-    EXPECT_NE(std::string::npos, Compare({Declared(), two}, {"-o", "ndjson"}).find("\"instancesOnlyInOthers\":2,")) << fOut;
+}
+
+TEST_F(SharedKeyTest, TheSummaryCountsWhatIsListed)
+{
+    const auto disks = [](std::size_t sharing, const std::string& alone) {
+        std::string document = Declared();
+        for (std::size_t boot = 0; boot < sharing; ++boot) {
+            document += OfSize(std::to_string(boot), "5");
+        }
+        return document + (alone.empty() ? "" : Instance("Disk", Value("Id", alone) + Value("Boot", "1")));
+    };
+    const struct {
+        std::vector<std::string> documents;
+        std::string headline;
+        std::string counts;
+    } rows[] = {
+        {{disks(0, "x"), disks(2, "y")},
+         "3 differences between a and b: 1 instance only in a, 2 keys only in b",
+         "\"differences\":3,\"onlyInReference\":1,\"onlyInOthers\":2,\"changedValues\":0,\"changedInstances\":0,"
+         "\"instancesOnlyInOthers\":3,"},
+        {{disks(0, ""), disks(1, ""), disks(1, "y")},
+         "2 differences between a and b, c: 2 instances only elsewhere",
+         "\"differences\":2,\"onlyInReference\":0,\"onlyInOthers\":2,\"changedValues\":0,\"changedInstances\":0,"
+         "\"instancesOnlyInOthers\":2,"},
+        {{disks(0, ""), disks(3, ""), disks(2, "y")},
+         "2 differences between a and b, c: 2 keys only elsewhere",
+         "\"differences\":2,\"onlyInReference\":0,\"onlyInOthers\":2,\"changedValues\":0,\"changedInstances\":0,"
+         "\"instancesOnlyInOthers\":4,"},
+    };
+    for (const auto& row : rows) {
+        EXPECT_EQ(row.headline, Headline(row.documents));
+        EXPECT_NE(std::string::npos, Compare(row.documents, {"-o", "ndjson"}).find(row.counts)) << fOut;
+    }
 }
 
 TEST_F(SharedKeyTest, WhatTheEngineTakesForEqualIsNotListed)
