@@ -1,5 +1,7 @@
 #include "client/report/JsonCoverage.h"
 
+#include <utility>
+
 namespace NORVZEL20 {
 
 namespace {
@@ -63,8 +65,12 @@ TJson JsonOfCoveredClass(const TComparisonReport& report, const TCoverage::TClas
                   {"sharingKeysWithoutPartner", cls.sharingAlone},
                   {"referencesReduced", cls.reducedReferences},
                   {"referenceKeysLeftOut", cls.referenceKeys}};
-    for (const std::size_t inventory : cls.madeIn) {
-        json["madeIn"].push_back(report.labels[inventory]);
+    if (!cls.madeIn.empty()) {
+        TJson labels = TJson::array();
+        for (const std::size_t inventory : cls.madeIn) {
+            labels.push_back(report.labels[inventory]);
+        }
+        json["madeIn"] = std::move(labels);
     }
     return json;
 }

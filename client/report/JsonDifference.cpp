@@ -15,6 +15,8 @@
 // "reference", "others" and perhaps "parts". "path" is there only if the rules exclude keys, "disagreements" only if there are any.
 #include "client/report/JsonDifference.h"
 
+#include <utility>
+
 #include "client/report/JsonValue.h"
 #include "client/text/EmbeddedText.h"
 #include "embedded/value/TValueText.h"
@@ -44,6 +46,15 @@ TJson ValueWithType(const TCIMValue& value)
         json["embedded"] = ContentsOf(value);
     }
     return json;
+}
+
+// Adds a list that is there only if it has elements. It is made before it is added: nlohmann's push_back on a missing element first
+// makes that element an array, and ends the process if there is no memory for it.
+void AddList(TJson& json, const char* name, TJson list)
+{
+    if (!list.empty()) {
+        json[name] = std::move(list);
+    }
 }
 
 // Makes the parts of one difference, which are all made with its report.
@@ -87,11 +98,13 @@ class TDifferenceWriter {
 
     void AddSharing(TJson& json) const
     {
+        TJson sharing = TJson::array();
         for (std::size_t i = 0; i < fDifference.sharing.size(); ++i) {
             if (fDifference.CountSharing(i) > 0) {
-                json["sharing"].push_back(Sharing(i, fDifference.CountSharing(i)));
+                sharing.push_back(Sharing(i, fDifference.CountSharing(i)));
             }
         }
+        AddList(json, "sharing", std::move(sharing));
     }
 
     void AddValues(TJson& json) const
@@ -100,9 +113,16 @@ class TDifferenceWriter {
             json.update(Values(fDifference.values.front()));
             return;
         }
-        for (const TValueDifference& values : fDifference.values) {
-            json["disagreements"].push_back(Values(values));
+        AddList(json, "disagreements", Values(fDifference.values));
+    }
+
+    TJson Values(const std::vector<TValueDifference>& differences) const
+    {
+        TJson list = TJson::array();
+        for (const TValueDifference& values : differences) {
+            list.push_back(Values(values));
         }
+        return list;
     }
 
     TJson Values(const TValueDifference& values) const
@@ -111,12 +131,12 @@ class TDifferenceWriter {
         if (fDifference.kind == TDifference::kChanged) {
             json["reference"] = ValueWithType(values.reference);
         }
+        TJson others = TJson::array();
         for (const TValueDifference::TGroup& group : values.others) {
-            json["others"].push_back(Group(group));
+            others.push_back(Group(group));
         }
-        for (const TValueDifference& part : values.parts) {
-            json["parts"].push_back(Values(part));
-        }
+        AddList(json, "others", std::move(others));
+        AddList(json, "parts", Values(values.parts));
         return json;
     }
 
@@ -124,11 +144,13 @@ class TDifferenceWriter {
     {
         TJson json = {{"inventories", Labels(group.inventories)}};
         json.update(ValueWithType(group.value));
+        TJson sharing = TJson::array();
         for (std::size_t i = 0; i < group.inventories.size(); ++i) {
             if (fDifference.CountSharing(group.inventories[i]) > 0) {
-                json["sharing"].push_back(Sharing(group.inventories[i], group.instances[i]));
+                sharing.push_back(Sharing(group.inventories[i], group.instances[i]));
             }
         }
+        AddList(json, "sharing", std::move(sharing));
         return json;
     }
 
