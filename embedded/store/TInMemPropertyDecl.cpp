@@ -89,6 +89,7 @@ void TInMemPropertyDecl::RewriteDefault(const TCIMValue& value)
     fDefault = WithoutClasses(value);
     if (isStillDefault) {
         fStaticProperty.SetState({fDefault, TCIMValue()});
+        MarkStaticValue();
     }
 }
 
@@ -136,6 +137,19 @@ void TInMemPropertyDecl::UpdateMarks()
     fStatic = qualifiers.IsTrueAnywhere("Static");
     fGenerated = fKey && GetType() == TCIMValue::TCIMType::kUint64 && qualifiers.IsTrue("Generated");
     fBag = GetType().IsArray() && IsBagDeclared();
+    MarkStaticValue();
+}
+
+/// The static value may be the default, which stands there before the qualifiers say what kind of array it is.
+void TInMemPropertyDecl::MarkStaticValue()
+{
+    TInMemStaticProperty::TState state = fStaticProperty.GetState();
+    if (!GetType().IsArray() || state.value.IsNull() || state.value.GetType() != GetType() || state.value.IsBag() == fBag) {
+        return;
+    }
+    const std::vector<TCIMValue>& elements = state.value.GetElements();
+    state.value = fBag ? state.value.AsBag() : TCIMValue(GetType(), static_cast<unsigned int>(elements.size()), elements);
+    fStaticProperty.SetState(state);
 }
 
 bool TInMemPropertyDecl::IsBagDeclared() const

@@ -75,6 +75,7 @@ class CIMDELTA_EXPORT TInMemPropertyDecl : public TInMemNamedElement<ICIMPropert
   private:
     void PutQualifier(boost::shared_ptr<ICIMQualifier> qualifier) override;
     void UpdateMarks();
+    void MarkStaticValue();
     bool IsBagDeclared() const;
 
     std::string fName;

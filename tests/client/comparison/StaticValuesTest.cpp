@@ -55,6 +55,26 @@ TEST_F(StaticValuesTest, APropertyMayBeStaticInOneInventoryAlone)
     EXPECT_NE(std::string::npos, Compare(ordinary, Disks("old")).find("    Firmware: y -> old\n"));
 }
 
+TEST_F(StaticValuesTest, AnArrayInTheDeclarationIsABagUnlessItSaysOtherwise)
+{
+    const auto disk = [](const std::string& qualifiers, const std::string& first, const std::string& second) {
+        return Document(System() +
+                        Class("Disk", "",
+                              KeyProperty("Id") + "<PROPERTY.ARRAY NAME=\"Modes\" TYPE=\"string\">" + Qualifier("Static") +
+                                  qualifiers + "<VALUE.ARRAY><VALUE>" + first + "</VALUE><VALUE>" + second +
+                                  "</VALUE></VALUE.ARRAY></PROPERTY.ARRAY>") +
+                        Instance("Disk", Value("Id", "0")));
+    };
+    const auto arrayType = [](const std::string& type) {
+        return "<QUALIFIER NAME=\"ArrayType\" TYPE=\"string\"><VALUE>" + type + "</VALUE></QUALIFIER>";
+    };
+    const std::string equal = "No differences between a and b.\n\nCompared: 2 classes; 2 instances of a, 2 instances of b.\n";
+    EXPECT_EQ(equal, Compare(disk("", "x", "y"), disk("", "y", "x")));
+    EXPECT_EQ(equal, Compare(disk(arrayType("Bag"), "x", "y"), disk(arrayType("Bag"), "y", "x")));
+    EXPECT_NE(std::string::npos, Compare(disk(arrayType("Ordered"), "x", "y"), disk(arrayType("Ordered"), "y", "x"))
+                                     .find("    Modes: {\"x\", \"y\"} -> {\"y\", \"x\"}\n"));
+}
+
 /// The value of the one that declares it may stand in the declaration itself.
 TEST_F(StaticValuesTest, APropertyThatOneInventoryDoesNotDeclareIsNullThere)
 {
