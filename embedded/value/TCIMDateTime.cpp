@@ -10,13 +10,15 @@
 //
 // The canonical offset depends only on what equality compares, so equal datetimes have the same canonical text: it is the first of
 // 0, 1, -1, 2, -2, ... at which every unknown field has its least value and the year has four digits. The offset that was read
-// fits, so the search ends. Nearly always 0 fits at once.
+// fits, and it is less than a day. So the local time lies on the day of UTC or on one of its neighbours, and on each of the three
+// days it is the fitting minute that is next to UTC.
 //
 // Days are counted in years that begin on March 1, which puts the leap day at the end of a year, and in eras of 400 such years
 // with 146,097 days each. From the beginning of era 0 to 1970-01-01 there are 719,468 days.
 
 #include "host/TCIMDateTime.h"
 
+#include <algorithm>
 #include <array>
 #include <cstdlib>
 
@@ -33,6 +35,8 @@ constexpr std::int64_t kSecond = 1000000;
 constexpr std::int64_t kMinute = 60 * kSecond;
 constexpr std::int64_t kHour = 60 * kMinute;
 constexpr std::int64_t kDay = 24 * kHour;
+constexpr std::int64_t kMinutesOfHour = 60;
+constexpr std::int64_t kMinutesOfDay = 24 * kMinutesOfHour;
 
 /// A field of the text: its place, its bit if it is unknown, and its range.
 struct TField {
@@ -141,19 +145,50 @@ TDays GetWholeDays(std::int64_t microseconds) noexcept
     return {microseconds / kDay - (isBefore ? 1 : 0), microseconds % kDay + (isBefore ? kDay : 0)};
 }
 
-/// Whether a text of the local time `local` can have asterisks over the fields of `unknown`. No offset changes the seconds.
-bool IsExpressible(std::int64_t local, unsigned int unknown) noexcept
+bool IsUnknown(const TField& field, unsigned int unknown) noexcept
 {
-    const TDays time = GetWholeDays(local);
-    const TDate date = GetDate(time.days);
-    const std::array<std::int64_t, 5> values{date.year, date.month, date.day, time.rest / kHour, time.rest % kHour / kMinute};
+    return (unknown & (1u << field.bit)) != 0;
+}
+
+/// Whether the year has four digits and the unknown ones of year, month and day have their least value.
+bool IsDateExpressible(std::int64_t days, unsigned int unknown) noexcept
+{
+    const TDate date = GetDate(days);
+    const std::array<std::int64_t, 3> values{date.year, date.month, date.day};
     for (std::size_t i = 0; i < values.size(); ++i) {
         const TField& field = kTimestampFields[i];
-        if ((unknown & (1u << field.bit)) != 0 && values[i] != field.least) {
+        if (IsUnknown(field, unknown) && values[i] != field.least) {
             return false;
         }
     }
     return date.year >= kTimestampFields[0].least && date.year <= kTimestampFields[0].greatest;
+}
+
+/// The minute of a day next to `minute`, which may be on another day, at which the unknown ones of hour and minute are 0. Of two
+/// that are equally near it is the later one.
+std::int64_t GetNearestMinute(std::int64_t minute, unsigned int unknown) noexcept
+{
+    const std::int64_t step = IsUnknown(kTimestampFields[4], unknown) ? kMinutesOfHour : 1;
+    const std::int64_t end = IsUnknown(kTimestampFields[3], unknown) ? kMinutesOfHour : kMinutesOfDay;
+    return std::clamp<std::int64_t>((minute + step / 2) / step * step, 0, end - step);
+}
+
+/// The offset next to UTC at which the point in time can be written with asterisks over the fields of `unknown`; of two such
+/// offsets the eastern one. No offset changes the seconds.
+std::int64_t FindCanonicalOffset(std::int64_t microseconds, unsigned int unknown) noexcept
+{
+    const TDays time = GetWholeDays(microseconds);
+    const std::int64_t minute = time.rest / kMinute;
+    std::int64_t best = kMinutesOfDay;
+    for (const std::int64_t day : {0, 1, -1}) {
+        const std::int64_t sought = minute - day * kMinutesOfDay;
+        const std::int64_t offset = GetNearestMinute(sought, unknown) - sought;
+        const bool isNearer = std::abs(offset) < std::abs(best) || offset == std::abs(best);
+        if (isNearer && IsDateExpressible(time.days + day, unknown)) {
+            best = offset;
+        }
+    }
+    return best;
 }
 
 /// Adds the interval to `microseconds`, which has its fraction of a second already. ReadTimestamp does the same.
@@ -206,7 +241,7 @@ template <class TFields>
 void WriteAsterisks(char* to, const TFields& fields, unsigned int unknown) noexcept
 {
     for (const TField& field : fields) {
-        for (std::size_t i = 0; (unknown & (1u << field.bit)) != 0 && i < field.length; ++i) {
+        for (std::size_t i = 0; IsUnknown(field, unknown) && i < field.length; ++i) {
             to[field.start + i] = '*';
         }
     }
@@ -244,10 +279,7 @@ TCIMDateTime TCIMDateTime::GetCanonical() const noexcept
     if (fOffset == 0) {
         return canonical;
     }
-    canonical.fOffset = 0;
-    while (!IsExpressible(fMicroseconds + canonical.fOffset * kMinute, fUnknown)) {
-        canonical.fOffset = static_cast<std::int16_t>(canonical.fOffset > 0 ? -canonical.fOffset : 1 - canonical.fOffset);
-    }
+    canonical.fOffset = static_cast<std::int16_t>(FindCanonicalOffset(fMicroseconds, fUnknown));
     return canonical;
 }
 

@@ -1,7 +1,11 @@
 #include <gtest/gtest.h>
 
 #include <cstdio>
+#include <cstdlib>
+#include <ctime>
 #include <string>
+#include <tuple>
+#include <utility>
 
 #include "tests/embedded/value/DateTimeOf.h"
 
@@ -9,6 +13,42 @@ namespace NORVZEL20 {
 namespace {
 
 constexpr std::int64_t kMicrosecondsOfDay = 86400000000;
+
+/// The text of a point in time at `offset`, by the C library's calendar, with asterisks where `time` has them.
+std::string WrittenAt(const TCIMDateTime& time, int offset)
+{
+    const std::time_t local =
+        (time.GetMicroseconds() - (time.GetMicroseconds() % 60000000 + 60000000) % 60000000) / 1000000 + offset * 60;
+    std::tm parts{};
+    gmtime_r(&local, &parts);
+    char text[64];
+    std::snprintf(text, sizeof text, "%04d%02d%02d%02d%02d", parts.tm_year + 1900, parts.tm_mon + 1, parts.tm_mday, parts.tm_hour,
+                  parts.tm_min);
+    std::string written(text);
+    for (const auto& [start, length, bit] : {std::tuple(0, 4, 0), {4, 2, 1}, {6, 2, 2}, {8, 2, 3}, {10, 2, 4}}) {
+        if ((time.GetUnknown() >> bit & 1) != 0) {
+            written.replace(static_cast<std::size_t>(start), static_cast<std::size_t>(length), static_cast<std::size_t>(length),
+                            '*');
+        }
+    }
+    std::snprintf(text, sizeof text, "%c%03d", offset < 0 ? '-' : '+', std::abs(offset));
+    return written + time.ToText().substr(12, 9) + text;
+}
+
+/// The canonical text by its definition: tries 0, 1, -1, 2, -2, ... until the text is that of an equal datetime.
+std::string FirstEqualText(const TCIMDateTime& time)
+{
+    for (int distance = 0; distance <= 999; ++distance) {
+        for (const int offset : {distance, -distance}) {
+            const std::string text = WrittenAt(time, offset);
+            TCIMDateTime read;
+            if (TCIMDateTime::Parse(text, read) && read == time) {
+                return text;
+            }
+        }
+    }
+    return "none";
+}
 
 TEST(DateTimeTest, TextComesBackAsItWasRead)
 {
@@ -94,6 +134,38 @@ TEST(DateTimeTest, WhatIsNoDateTimeIsRefusedAndLeavesTheResult)
         TCIMDateTime time = DateTimeOf("20240101120000.000000+000");
         EXPECT_FALSE(TCIMDateTime::Parse(text, time)) << text;
         EXPECT_EQ("20240101120000.000000+000", time.ToText()) << text;
+    }
+}
+
+TEST(DateTimeTest, TheCanonicalOffsetIsTheOneNextToUtcThatCanExpressIt)
+{
+    const std::pair<const char*, const char*> cases[] = {
+        {"20240229120000.000000+060", "20240229110000.000000+000"}, {"20240229******.******-999", "20240301******.******+441"},
+        {"20240229******.******+720", "20240229******.******+720"}, {"20240229******.******-720", "20240301******.******+720"},
+        {"2024022912****.******+030", "2024022912****.******+030"}, {"2024022912****.******-030", "2024022913****.******+030"},
+        {"00000101000000.000000+999", "00000101000000.000000+999"}, {"99991231235959.999999-999", "99991231235959.999999-999"},
+        {"********120000.000000+060", "********110000.000000+000"}, {"00000012123456.9*****:000", "00000012123456.9*****:000"},
+    };
+    for (const auto& [text, canonical] : cases) {
+        EXPECT_EQ(canonical, DateTimeOf(text).GetCanonical().ToText()) << text;
+    }
+}
+
+TEST(DateTimeTest, TheCanonicalTextIsTheFirstThatReadsAsAnEqualDatetime)
+{
+    const char* const places[] = {"00000101", "0000****", "****0101", "********", "19691231", "20240229",
+                                  "2024**01", "202403**", "20241231", "99990101", "9999****", "99991231"};
+    const char* const times[] = {"000000", "235959", "****12", "**0000", "**5900",
+                                 "00****", "12****", "23****", "******", "113001"};
+    for (const std::string place : places) {
+        for (const char* const time : times) {
+            for (const char* const offset :
+                 {"+001", "-001", "+030", "-030", "+060", "-090", "+480", "-720", "+721", "+999", "-999"}) {
+                const std::string text = place + time + ".12345*" + offset;
+                const TCIMDateTime read = DateTimeOf(text);
+                ASSERT_EQ(FirstEqualText(read), read.GetCanonical().ToText()) << text;
+            }
+        }
     }
 }
 
