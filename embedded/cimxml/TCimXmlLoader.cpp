@@ -86,7 +86,7 @@ void TCimXmlLoader::Explain(const TZELException& error, const TInMemInstance& in
     const std::string ofClass = " of class " + Quote(instance.GetInMemClass()->GetName());
     if (status == EStatus::kAlreadyExists) {
         constexpr std::size_t kLongestPath = 200;
-        const std::string path = instance.GetReference().GetPath();
+        const std::string path = instance.GetReference().ToText();
         fContext.Fail(status, "found a second instance " + (path.size() > kLongestPath ? Quote(path) : path) + "; instances" +
                                   ofClass + " must differ in their keys");
     }

@@ -28,7 +28,8 @@ boost::shared_ptr<const std::string> TStoreRefusal::Compose(const std::string& r
 std::string TStoreRefusal::Shown(TCIMReference path)
 {
     path.SetNamespaceName("");
-    std::string text = path.GetPath();
+    path.SetHost("");
+    std::string text = path.ToText();
     if (text.size() <= kLongestPath) {
         return text;
     }

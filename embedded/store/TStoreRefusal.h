@@ -33,7 +33,7 @@ class CIMDELTA_EXPORT TStoreRefusal : public TZELException {
 
     const char* what() const noexcept override { return fText ? fText->c_str() : TZELException::what(); }
 
-    /// The text of a path within its namespace, cut off after 200 bytes.
+    /// The path within its namespace as it was written (TCIMReference::ToText), cut off after 200 bytes.
     static std::string Shown(TCIMReference path);
 
   private:

@@ -169,5 +169,21 @@ TEST(OrderTest, TwoKeysThatAreOneAsDeclaredAreRefusedWithTheirPlace)
               loading.ErrorOf(TLoading::Group(part + instance + other + kDisk)));
 }
 
+TEST(OrderTest, ASecondInstanceIsNamedAsItIsWrittenOnItsLine)
+{
+    TLoading loading;
+    const auto event = [](const char* when) {
+        return Object("<INSTANCE CLASSNAME=\"Event\"><PROPERTY NAME=\"When\" TYPE=\"datetime\"><VALUE>" + std::string(when) +
+                      "</VALUE></PROPERTY></INSTANCE>");
+    };
+    const std::string cls =
+        Object(std::string("<CLASS NAME=\"Event\"><PROPERTY NAME=\"When\" TYPE=\"datetime\">") + kKey + "</PROPERTY></CLASS>");
+    const std::string error =
+        loading.ErrorOf(TLoading::Group(cls + event("20240229110000.000000+000") + event("20240229120000.000000+060")));
+    EXPECT_EQ("found a second instance root/cimv2:Event.When=\"20240229120000.000000+060\"; instances of class \"Event\" must "
+              "differ in their keys",
+              error.substr(error.find("found")));
+}
+
 }  // namespace
 }  // namespace NORVZEL20

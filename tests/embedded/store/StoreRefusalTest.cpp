@@ -3,6 +3,7 @@
 
 #include "embedded/store/TStoreRefusal.h"
 #include "tests/embedded/store/TInMemFixture.h"
+#include "tests/embedded/value/DateTimeOf.h"
 
 namespace NORVZEL20 {
 namespace {
@@ -64,6 +65,7 @@ TEST_F(StoreRefusalTest, APathThatFindsNothingIsNamed)
 {
     const std::pair<const char*, const char*> cases[] = {
         {"root/x:Disk.Id=\"sdz\",Bay=1", "Not found: instance Disk.Bay=1,Id=\"sdz\""},
+        {"//web01/root/x:Disk.Id=\"sdz\",Bay=1", "Not found: instance Disk.Bay=1,Id=\"sdz\""},
         {"Fan.Id=\"1\"", "Not found: instance Fan.Id=\"1\""},
         {"Disk.Id=\"sda\"", "Key without a value: key Bay of path Disk.Id=\"sda\""},
         {"Disk.Id=\"sda\",Bay=\"first\"", "Type mismatch: key Bay of path Disk.Bay=\"first\",Id=\"sda\" is no uint8"},
@@ -73,6 +75,19 @@ TEST_F(StoreRefusalTest, APathThatFindsNothingIsNamed)
         EXPECT_EQ(refusal, RefusalOf([&, &text = path] { fNamespace->DeleteInstance(Path(text), kNoContext); }));
         EXPECT_EQ(refusal, RefusalOf([&, &text = path] { fNamespace->ModifyInstance(Path(text), {}, kNoContext); }));
     }
+}
+
+TEST_F(StoreRefusalTest, KeysAreShownAsTheyWereWritten)
+{
+    const TClassPointer event = Declare("Event", nullptr, {{"When", TType::kDateTime, {"Key"}}});
+    const auto add = [&](const char* when) {
+        Allocate(event, {{"When", TCIMValue(DateTimeOf(when))}})->AddToNamespace(kNoContext);
+    };
+    EXPECT_EQ("", RefusalOf([&] { add("20240229110000.000000+000"); }));
+    EXPECT_EQ("Already exists: instance Event.When=\"20240229120000.000000+060\"",
+              RefusalOf([&] { add("20240229120000.000000+060"); }));
+    EXPECT_EQ("Not found: instance Event.When=\"20250101120000.000000+060\"",
+              RefusalOf([&] { fNamespace->GetInstance(Path("Event.When=\"20250101120000.000000+060\""), kNoContext); }));
 }
 
 TEST_F(StoreRefusalTest, AChangeThatIsRefusedIsNamed)
