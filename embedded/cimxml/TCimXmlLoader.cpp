@@ -108,12 +108,20 @@ void TCimXmlLoader::Finish(const TReadObjects& readObjects)
         EndInstance(&draft.ownKeys);
     }
     fContext.GetOwnPlace().Decide();
+    fOwnPlace = fContext.GetOwnPlace().GetNamed();
     fClasses.MakeDefaultsLocal();
     fLate.MakeReferencesLocal(fContext.GetOwnPlace());
     for (const TCimXmlLateInstances::THeld& held : fLate.TakeHeld()) {
         const TCimXmlContext::TAt at(fContext, held.place);
         Add(held.instance);
     }
+}
+
+/// References that turn up later, when text becomes one, are to be local too, so the namespace needs what the load has found out.
+void TCimXmlLoader::Commit() noexcept
+{
+    fNamespace->SetOwnPlace(std::move(fOwnPlace));
+    fStaging.Commit();
 }
 
 std::vector<boost::shared_ptr<ICIMElement>> TCimXmlLoader::TakeElements()

@@ -53,7 +53,7 @@ class CIMDELTA_INTERNAL_EXPORT TCimXmlLoader {
     /// others.
     void Finish(const TReadObjects& readObjects);
     /// Keeps what was added.
-    void Commit() noexcept { fStaging.Commit(); }
+    void Commit() noexcept;
 
     /// From now on remembers the instances, for TakeElements.
     void KeepElements() { fKeep = true; }
@@ -74,6 +74,7 @@ class CIMDELTA_INTERNAL_EXPORT TCimXmlLoader {
     TCimXmlLateInstances fLate;
     TCimXmlInstanceBuilder fBuilder;
     bool fHasEnded = false;  // the document: instances are held until it is decided which references are local
+    TOwnPlace fOwnPlace;     // of the document, when it has ended
     bool fKeep = false;
     std::vector<boost::shared_ptr<ICIMElement>> fKeptInstances;
 };

@@ -19,17 +19,12 @@ namespace NORVZEL20 {
 
 TCimXmlOwnPlace::EAnswer TCimXmlOwnPlace::Classify(const std::string& name, const std::string& host)
 {
-    const bool isOwnName = TNameText::Equal(name, fReport.namespaceName);
-    if (fIsDecided || fReport.namesNamespace) {
-        if (!isOwnName) {
-            return kForeign;
-        }
-        if (host.empty() || fIsAnyHostOwn) {
-            return kOwn;
-        }
-        if (fIsDecided || !fReport.host.empty()) {
-            return TNameText::Equal(host, fReport.host) ? kOwn : kForeign;
-        }
+    // What the document has named itself does not change any more.
+    if (fIsDecided || (fReport.namesNamespace && (host.empty() || !fReport.host.empty()))) {
+        return GetNamed().Contains(name, host) ? kOwn : kForeign;
+    }
+    if (fReport.namesNamespace && !TNameText::Equal(name, fReport.namespaceName)) {
+        return kForeign;
     }
     THosts& hosts = fNamed[name];
     if (hosts.first.empty()) {
@@ -79,8 +74,13 @@ void TCimXmlOwnPlace::Decide()
         fReport.namespaceName = fNamed.begin()->first;
     }
     const auto own = fNamed.find(fReport.namespaceName);
-    fIsAnyHostOwn = fReport.host.empty() && own != fNamed.end() && !own->second.areSeveral;
+    fIsAnyHostOwn = fReport.host.empty() && (own == fNamed.end() || !own->second.areSeveral);
     fIsDecided = true;
+}
+
+TOwnPlace TCimXmlOwnPlace::GetNamed() const
+{
+    return {fReport.namespaceName, fReport.host, fIsAnyHostOwn};
 }
 
 }  // namespace NORVZEL20

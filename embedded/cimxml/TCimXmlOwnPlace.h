@@ -3,6 +3,7 @@
 #include <string>
 
 #include "embedded/cimxml/TLoadReport.h"
+#include "embedded/store/TOwnPlace.h"
 #include "embedded/value/TNameText.h"
 #include "host/Export.h"
 #include "host/TCIMReference.h"
@@ -36,6 +37,8 @@ class CIMDELTA_INTERNAL_EXPORT TCimXmlOwnPlace {
     /// Decides about the open references. Call it when the document has ended and all its references have been classified. Gives
     /// the report the namespace if the document names none itself.
     void Decide();
+    /// The place that the document has named so far, or that was decided on.
+    TOwnPlace GetNamed() const;
 
   private:
     /// The hosts that open references name beside one namespace.

@@ -21,6 +21,7 @@
 #include "embedded/store/TReferenceAdapter.h"
 #include "embedded/store/TSchemaLimits.h"
 #include "embedded/value/TNameText.h"
+#include "embedded/value/TValueAccess.h"
 #include "embedded/value/TValueText.h"
 #include "embedded/value/Trim.h"
 
@@ -50,7 +51,8 @@ TCimXmlPathReader::TCimXmlPathReader(TCimXmlContext& context, boost::shared_ptr<
 void TCimXmlPathReader::Begin()
 {
     if (++fDepth > kMaxDepth) {
-        FailTooDeep();
+        fContext.Fail(EStatus::kParseError,
+                      "found object paths nested more than " + std::to_string(kMaxDepth) + " deep, expected fewer levels");
     }
     if (fDepth > fFrames.size()) {  // frames are reused, because their strings and vectors keep their memory
         fFrames.emplace_back();
@@ -83,14 +85,14 @@ TCIMReference TCimXmlPathReader::End()
     for (const auto& [declared, value] : frame.keys) {
         std::string name = declared.empty() ? FindOnlyKey(cls.get()) : declared;
         TCIMValue adapted = value;
-        if (!cls || TReferenceAdapter::AdaptKey(*cls, name, adapted) == nullptr) {
+        if (!cls || TReferenceAdapter(*fNamespace).AdaptKey(*cls, name, adapted) == nullptr) {
             fContext.CheckName("key", name);
         } else if (adapted.GetType() == TType::kReference && value.GetType() != TType::kReference) {
-            TReferenceAdapter(*fNamespace).Adapt(adapted);
             fContext.GetOwnPlace().MakeLocal(adapted);
             fMetUnsettled = true;  // perhaps: the text names a class that may be declared later
         }
-        AddKeyTo(path, name, adapted);
+        TValueAccess::LimitDepth(adapted, TReferenceAdapter::kLevelsAbove);
+        path.AddKeyValue(name, adapted);
     }
     if (path.GetKeyCount() < frame.keys.size()) {  // adding a key again replaces it
         fContext.Fail(EStatus::kParseError, "found a key a second time in one path, expected each once");
@@ -110,21 +112,6 @@ void TCimXmlPathReader::SetPlace(TCIMReference& path, const TFrame& frame)
         path.SetHost(frame.host);
     }
     fMetUnsettled = fMetUnsettled || answer == TCimXmlOwnPlace::kOpen;
-}
-
-void TCimXmlPathReader::AddKeyTo(TCIMReference& path, const std::string& name, const TCIMValue& value) const
-{
-    try {
-        path.AddKeyValue(name, value);
-    } catch (const TZELException&) {
-        FailTooDeep();
-    }
-}
-
-void TCimXmlPathReader::FailTooDeep() const
-{
-    fContext.Fail(EStatus::kParseError,
-                  "found object paths nested more than " + std::to_string(kMaxDepth) + " deep, expected fewer levels");
 }
 
 /// The key that a value without a name belongs to: the class must have exactly one.

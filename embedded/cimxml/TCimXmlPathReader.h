@@ -70,8 +70,6 @@ class TCimXmlPathReader {
     boost::shared_ptr<TInMemClass> FindClass(const std::string& name);
     TCIMValue ReadKey(std::string_view text);
     void SetPlace(TCIMReference& path, const TFrame& frame);
-    void AddKeyTo(TCIMReference& path, const std::string& name, const TCIMValue& value) const;
-    [[noreturn]] void FailTooDeep() const;
     const std::string& FindOnlyKey(const TInMemClass* cls) const;
 
     TCimXmlContext& fContext;

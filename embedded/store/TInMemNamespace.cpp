@@ -18,7 +18,7 @@
 
 namespace NORVZEL20 {
 
-TInMemNamespace::TInMemNamespace(const std::string& name) : fName(Trim(name, "/")) {}
+TInMemNamespace::TInMemNamespace(const std::string& name) : fName(Trim(name, "/")), fOwnPlace{fName, std::string(), true} {}
 
 boost::shared_ptr<TInMemNamespace> TInMemNamespace::Create(const std::string& name)
 {

@@ -8,6 +8,7 @@
 
 #include "embedded/store/TInMemClass.h"
 #include "embedded/store/TInMemQualifierDecl.h"
+#include "embedded/store/TOwnPlace.h"
 #include "embedded/value/ILocated.h"
 #include "embedded/value/TNameText.h"
 #include "host/Export.h"
@@ -83,6 +84,10 @@ class CIMDELTA_EXPORT TInMemNamespace final : public ICIMNamespace,
     void Withdraw(const TInMemQualifierDecl& decl) noexcept;
     /// The instance of that path; null if there is none or no such class. Errors: kTypeMismatch (13), kKeyMissing (14).
     boost::shared_ptr<TInMemInstance> FindInstance(const TCIMReference& path) const;
+    /// What references may name and still stay in this namespace: what the last document that was loaded says of itself; before
+    /// that, the name of the namespace with any host.
+    const TOwnPlace& GetOwnPlace() const noexcept { return fOwnPlace; }
+    void SetOwnPlace(TOwnPlace place) noexcept { fOwnPlace = std::move(place); }
     /// Call this after the text of a reference may have changed, with the spelling of a class or of a key: instances with
     /// references in their keys are then found by the new text.
     void ReferenceTextsChanged();
@@ -106,6 +111,7 @@ class CIMDELTA_EXPORT TInMemNamespace final : public ICIMNamespace,
     boost::shared_ptr<TInMemInstance> RequireInstance(const TCIMReference& path) const;
 
     std::string fName;
+    TOwnPlace fOwnPlace;
     boost::shared_ptr<TInMemClass> fRoot;  // "<root>": its subclasses are the top-level classes
     std::vector<boost::shared_ptr<TInMemClass>> fClasses;
     TNameHashMap<TEntry> fClassesByName;

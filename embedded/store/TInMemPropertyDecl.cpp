@@ -48,6 +48,14 @@ const TCIMValue& TInMemPropertyDecl::GetDefaultValue(TCallContext) const
     return fDefault;
 }
 
+bool TInMemPropertyDecl::HoldsObjects() const
+{
+    if (GetType().GetElementType() != TCIMValue::TCIMType::kString) {
+        return false;
+    }
+    return GetQualifiers().IsTrue("EmbeddedObject") || GetQualifiers().Find("EmbeddedInstance");
+}
+
 TCIMValue TInMemPropertyDecl::Fit(TCIMValue value) const
 {
     if (value.IsNull()) {

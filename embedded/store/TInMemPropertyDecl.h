@@ -45,6 +45,9 @@ class CIMDELTA_EXPORT TInMemPropertyDecl : public TInMemNamedElement<ICIMPropert
     /// Whether a null is replaced by the next number of the class when an instance is added: a uint64 key with Generated(true).
     bool IsGenerated() const noexcept { return fGenerated; }
 
+    /// Whether text in it may be an embedded object: a string with EmbeddedObject(true) or EmbeddedInstance. Cost: looks for both.
+    bool HoldsObjects() const;
+
     /// The value as the property holds it: nulls typed, bags marked. Errors: kTypeMismatch (13) if the types differ.
     TCIMValue Fit(TCIMValue value) const;
 

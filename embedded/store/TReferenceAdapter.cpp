@@ -5,6 +5,10 @@
 // itself and with keys of the declared spelling and type. A key may be a reference, so this goes on inside; arrays and the
 // properties of embedded objects are searched too. A value in which nothing changes is not copied.
 //
+// A key that was text may turn out to be a reference only now. It then has to look as if it had been one from the start: without
+// the own namespace (TOwnPlace), and with text again in the place of what nests too deeply (TValueAccess::LimitDepth). That text is
+// the one that a reference would have in the path, so it does not matter in which steps the references were made.
+//
 // If a reference that is a key, or in an embedded object that is one, changes, its instance has another path. The index of the
 // extent is renewed afterwards, and two instances may turn out to have one path, if their keys differed in nothing but the spelling
 // of a name.
@@ -86,7 +90,7 @@ std::string FindDuplicate(TInMemClass& cls)
 
 }  // namespace
 
-const TInMemPropertyDecl* TReferenceAdapter::AdaptKey(const TInMemClass& cls, std::string& name, TCIMValue& value)
+const TInMemPropertyDecl* TReferenceAdapter::AdaptKey(const TInMemClass& cls, std::string& name, TCIMValue& value) const
 {
     const std::uint32_t slot = cls.GetLayout().FindSlot(name);
     if (slot == TInMemLayout::kNoSlot) {
@@ -94,11 +98,22 @@ const TInMemPropertyDecl* TReferenceAdapter::AdaptKey(const TInMemClass& cls, st
     }
     const TInMemPropertyDecl& decl = cls.GetLayout().GetDecl(slot);
     name = decl.GetName();
-    TCIMValue adapted;
-    if (value.GetType() != decl.GetType() && TValueText::ConvertKey(value, decl.GetType(), adapted)) {
-        value = adapted;
-    }
+    AdaptKeyValue(decl, value);
     return &decl;
+}
+
+bool TReferenceAdapter::AdaptKeyValue(const TInMemPropertyDecl& decl, TCIMValue& value) const
+{
+    TCIMValue adapted;
+    if (value.GetType() == decl.GetType() || !TValueText::ConvertKey(value, decl.GetType(), adapted)) {
+        return false;
+    }
+    Adapt(adapted);  // text may have become a reference
+    TAccess::LimitDepth(adapted, kLevelsAbove);
+    // A path that nests too deeply is text again.
+    const bool isChanged = adapted.GetType() != value.GetType() || adapted != value;
+    value = adapted;
+    return isChanged;
 }
 
 bool TReferenceAdapter::Adapt(TCIMValue& value) const
@@ -110,24 +125,38 @@ bool TReferenceAdapter::AdaptPath(TCIMValue& value) const
 {
     const TCIMReference path = value;
     const boost::shared_ptr<TInMemClass> cls = fNamespace.FindClass(path.GetClassName());
-    bool isChanged = cls && path.GetClass() != cls;
+    const bool namesOwnPlace = fOwnPlace != nullptr && fOwnPlace->IsNamedBy(path);
+    bool isChanged = namesOwnPlace || (cls && path.GetClass() != cls);
     TKeys keys = GetKeys(path);
     for (auto& [name, key] : keys) {
-        isChanged = Adapt(key) || isChanged;
-        if (!cls) {
-            continue;
-        }
-        const std::string nameBefore = name;
-        const TCIMValue::TCIMType typeBefore = key.GetType();
-        AdaptKey(*cls, name, key);
-        if (key.GetType() != typeBefore) {
-            Adapt(key);  // text may have become a reference
-        }
-        isChanged = isChanged || name != nameBefore || key.GetType() != typeBefore;
+        isChanged = AdaptBinding(cls.get(), name, key) || isChanged;
     }
+    if (!isChanged) {
+        return false;
+    }
+    TCIMReference adapted = MakePath(path, cls ? boost::shared_ptr<ICIMClass>(cls) : path.GetClass(), keys);
+    if (namesOwnPlace) {
+        adapted.SetNamespaceName("");
+        adapted.SetHost("");
+    }
+    value = TCIMValue(adapted);
+    return true;
+}
+
+/// `cls` is null if the class of the path is not declared. Returns whether name or value changed.
+bool TReferenceAdapter::AdaptBinding(const TInMemClass* cls, std::string& name, TCIMValue& value) const
+{
+    bool isChanged = Adapt(value);
     if (isChanged) {
-        value = TCIMValue(MakePath(path, cls ? boost::shared_ptr<ICIMClass>(cls) : path.GetClass(), keys));
+        TAccess::LimitDepth(value, kLevelsAbove);
     }
+    const std::uint32_t slot = cls != nullptr ? cls->GetLayout().FindSlot(name) : TInMemLayout::kNoSlot;
+    if (slot == TInMemLayout::kNoSlot) {
+        return isChanged;
+    }
+    const TInMemPropertyDecl& decl = cls->GetLayout().GetDecl(slot);
+    isChanged = AdaptKeyValue(decl, value) || isChanged || name != decl.GetName();
+    name = decl.GetName();
     return isChanged;
 }
 
@@ -178,7 +207,7 @@ bool TReferenceAdapter::AdaptInstances(TInMemClass& cls) const
 
 std::string TReferenceAdapter::AdaptAndFindDuplicate(TInMemNamespace& ns)
 {
-    const TReferenceAdapter adapter(ns);
+    const TReferenceAdapter adapter(ns, ns.GetOwnPlace());
     std::vector<boost::shared_ptr<TInMemClass>> withChangedKeys;
     for (const boost::shared_ptr<TInMemClass>& cls : ns.GetClasses()) {
         adapter.AdaptStatics(*cls);

@@ -12,31 +12,41 @@ namespace NORVZEL20 {
 /// Brings references in line with the classes of a namespace: with the class itself, keys spelled and typed as declared.
 ///
 /// It is meant for references that were made before their class was declared, or before a name was spelled another way. References
-/// within keys, arrays and embedded objects are adapted too.
+/// within keys, arrays and embedded objects are adapted too. A key that nests too deeply becomes text.
 class CIMDELTA_INTERNAL_EXPORT TReferenceAdapter {
   public:
-    /// `ns` must outlive this.
-    explicit TReferenceAdapter(const TInMemNamespace& ns) noexcept : fNamespace(ns) {}
+    /// A reference may be a key, so its own keys leave one level for the path of its instance.
+    static constexpr unsigned int kLevelsAbove = 1;
 
-    /// Gives a key of a path its declared spelling, and its declared type if that loses nothing. Returns the declaration. If `cls`
-    /// has no property of that name, it returns null and leaves the key alone.
-    static const TInMemPropertyDecl* AdaptKey(const TInMemClass& cls, std::string& name, TCIMValue& value);
+    /// References keep the namespaces that they name. `ns` must outlive this.
+    explicit TReferenceAdapter(const TInMemNamespace& ns) noexcept : fNamespace(ns) {}
+    /// References to `ownPlace` lose namespace and host. Both must outlive this.
+    TReferenceAdapter(const TInMemNamespace& ns, const TOwnPlace& ownPlace) noexcept : fNamespace(ns), fOwnPlace(&ownPlace) {}
+
+    /// Gives a key of a path its declared spelling, and its value as AdaptKeyValue. Returns the declaration. If `cls` has no
+    /// property of that name, it returns null and leaves the key alone.
+    const TInMemPropertyDecl* AdaptKey(const TInMemClass& cls, std::string& name, TCIMValue& value) const;
+    /// Gives the value of a key its declared type if that loses nothing, and adapts it if it has become a reference. Returns
+    /// whether it changed.
+    bool AdaptKeyValue(const TInMemPropertyDecl& decl, TCIMValue& value) const;
 
     /// Adapts the references in `value`. Returns false if nothing in it was to be changed.
     bool Adapt(TCIMValue& value) const;
 
-    /// Adapts what the instances and static properties of `ns` hold. An instance whose keys change is found by the new ones. Two
-    /// instances whose keys differed before may have the same ones then: returns the path of the first such pair, else an empty
-    /// text. Cost: one pass over all values that may hold a reference.
+    /// Adapts what the instances and static properties of `ns` hold, and makes references to TInMemNamespace::GetOwnPlace local. An
+    /// instance whose keys change is found by the new ones. Two instances whose keys differed before may have the same ones then:
+    /// returns the path of the first such pair, else an empty text. Cost: one pass over all values that may hold a reference.
     static std::string AdaptAndFindDuplicate(TInMemNamespace& ns);
 
   private:
     bool AdaptPath(TCIMValue& value) const;
+    bool AdaptBinding(const TInMemClass* cls, std::string& name, TCIMValue& value) const;
     void AdaptStatics(const TInMemClass& cls) const;
     bool AdaptInstances(TInMemClass& cls) const;
     bool AdaptInstance(TInMemInstance& instance, const std::vector<std::uint32_t>& slots) const;
 
     const TInMemNamespace& fNamespace;
+    const TOwnPlace* fOwnPlace = nullptr;  // null: namespaces stay
 };
 
 }  // namespace NORVZEL20

@@ -288,13 +288,11 @@ TCIMReference TCIMReference::Parse(const std::string& text, boost::shared_ptr<IC
     // The bindings are sorted and have no duplicates, so each is added at the end.
     path.fContents->bindings.reserve(reader.GetBindings().size());
     for (TPathReader::TBinding& binding : reader.GetBindings()) {
-        const TCIMValue read = binding.value;
         if (cls) {
             Adapt(binding, *cls, ns);
         }
-        // Text in quotes may hold paths that nest too deeply. It stays text then.
-        const bool isTooDeep = TContents::GetDepth(binding.value) > TContents::kMaxDepth;
-        path.AddKeyValue(binding.name, isTooDeep ? read : binding.value);
+        TValueAccess::LimitDepth(binding.value, 0);  // text in quotes may hold paths that nest too deeply
+        path.AddKeyValue(binding.name, binding.value);
     }
     return path;
 }

@@ -6,6 +6,7 @@
 #include <new>
 
 #include "embedded/value/TCountedBlocks.h"
+#include "embedded/value/TEmbeddedObject.h"
 #include "embedded/value/TReferenceContents.h"
 
 namespace NORVZEL20 {
@@ -89,6 +90,18 @@ const TCounted* TValueAccess::AcquirePath(const TCIMReference& path) noexcept
         path.fContents->Acquire();
     }
     return path.fContents;
+}
+
+void TValueAccess::LimitDepth(TCIMValue& key, unsigned int above)
+{
+    if (TCIMReference::TContents::GetDepth(key) + above <= TCIMReference::TContents::kMaxDepth) {
+        return;
+    }
+    if (GetForm(key) == kPath) {
+        key = TCIMValue(GetPath(key).GetPath());
+    } else if (GetForm(key) == kObject) {
+        key = TCIMValue(key.GetEmbeddedObject()->GetKeyText());
+    }
 }
 
 // TCounted is not polymorphic: the form says which block it is.

@@ -47,6 +47,11 @@ class CIMDELTA_INTERNAL_EXPORT TValueAccess {
     /// The path of a value of form kPath, without a copy. Valid until the value changes.
     static const TCIMReference& GetPath(const TCIMValue& value) noexcept;
 
+    /// Makes a key that holds references nested too deeply for a path into text, with which the path has the same text: a path into
+    /// its path text, an embedded object into TEmbeddedObject::GetKeyText. Other keys stay as they are. `above` says how many
+    /// paths the path may be in itself.
+    static void LimitDepth(TCIMValue& key, unsigned int above);
+
   private:
     friend class TCIMValue;
 

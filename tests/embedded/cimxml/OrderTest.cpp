@@ -42,6 +42,13 @@ std::string Escaped(const std::string& xml)
     return text;
 }
 
+std::string Quoted(const std::string& text)
+{
+    std::string quoted;
+    TCIMValue(text).AppendKeyText(quoted);
+    return quoted;
+}
+
 /// Every value of the namespace, a line for each, sorted.
 std::string ContentsOf(const TLoading& loading)
 {
@@ -140,6 +147,46 @@ TEST(OrderTest, WhatADeclarationSaysIsAnObjectIsOneWhereverTheDeclarationStands)
     EXPECT_EQ("root/cimv2:Box.Id=\"a\" Also {\"plain\", " + object +
                   "}\nroot/cimv2:Box.Id=\"a\" Id a\nroot/cimv2:Box.Id=\"a\" In " + object + "\n",
               ContentsInEveryOrder({kDisk, box, TLoading::Instance("Box", "a", TLoading::Property("In", "string", thing) + also)}));
+}
+
+TEST(OrderTest, ATextThatIsAReferenceAsDeclaredLosesTheOwnNamespaceInAnObjectToo)
+{
+    const std::string part =
+        Object(std::string("<CLASS NAME=\"Part\"><PROPERTY.REFERENCE NAME=\"On\">") + kKey + "</PROPERTY.REFERENCE></CLASS>");
+    const std::string use = Object(std::string("<CLASS NAME=\"Use\"><PROPERTY NAME=\"Id\" TYPE=\"string\">") + kKey +
+                                   "</PROPERTY><PROPERTY.REFERENCE NAME=\"R\"/><PROPERTY NAME=\"In\" TYPE=\"string\"/></CLASS>");
+    const std::string path = "<VALUE.REFERENCE><INSTANCENAME CLASSNAME=\"part\"><KEYBINDING NAME=\"on\">"
+                             "<KEYVALUE>root/cimv2:disk.id=7</KEYVALUE></KEYBINDING></INSTANCENAME></VALUE.REFERENCE>";
+    const std::string in = "<PROPERTY NAME=\"In\" TYPE=\"string\" EmbeddedObject=\"object\"><VALUE>" +
+                           Escaped("<INSTANCE CLASSNAME=\"X\">" + ReferenceTo("R", path) + "</INSTANCE>") + "</VALUE></PROPERTY>";
+    const std::string object = "<INSTANCE CLASSNAME=\"X\"><PROPERTY.REFERENCE NAME=\"R\"><VALUE.REFERENCE><INSTANCENAME "
+                               "CLASSNAME=\"Part\"><KEYBINDING NAME=\"On\"><VALUE.REFERENCE><INSTANCENAME CLASSNAME=\"Disk\">"
+                               "<KEYBINDING NAME=\"Id\"><KEYVALUE VALUETYPE=\"numeric\" TYPE=\"uint32\">7</KEYVALUE>"
+                               "</KEYBINDING></INSTANCENAME></VALUE.REFERENCE></KEYBINDING></INSTANCENAME></VALUE.REFERENCE>"
+                               "</PROPERTY.REFERENCE></INSTANCE>";
+    EXPECT_EQ("root/cimv2:Use.Id=\"a\" Id a\nroot/cimv2:Use.Id=\"a\" In " + object +
+                  "\nroot/cimv2:Use.Id=\"a\" R Part.On=\"Disk.Id=7\"\n",
+              ContentsInEveryOrder({kDisk, part, use, TLoading::Instance("Use", "a", ReferenceTo("R", path) + in)}));
+}
+
+TEST(OrderTest, PathsInTextThatNestTooDeeplyStayTextInEveryOrder)
+{
+    const std::string use = Object(std::string("<CLASS NAME=\"Use\"><PROPERTY NAME=\"Id\" TYPE=\"string\">") + kKey +
+                                   "</PROPERTY><PROPERTY.REFERENCE NAME=\"R\"/></CLASS>");
+    const std::string part =
+        Object(std::string("<CLASS NAME=\"Part\"><PROPERTY.REFERENCE NAME=\"On\">") + kKey + "</PROPERTY.REFERENCE></CLASS>");
+    for (const int depth : {11, 12, 13, 14}) {
+        std::string written = "disk.id=5";
+        std::string stored = "Disk.Id=5";
+        for (int level = 0; level < depth; ++level) {
+            written = "part.on=" + Quoted(written);
+            stored = "Part.On=" + Quoted(stored);
+        }
+        EXPECT_EQ(
+            "root/cimv2:Use.Id=\"a\" Id a\nroot/cimv2:Use.Id=\"a\" R " + stored + "\n",
+            ContentsInEveryOrder({kDisk, part, use, TLoading::Instance("Use", "a", TLoading::Property("R", "string", written))}))
+            << depth;
+    }
 }
 
 TEST(OrderTest, InstancesOfAClassStayInTheDocumentsOrder)
