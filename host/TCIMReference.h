@@ -56,6 +56,11 @@ class CIMDELTA_EXPORT TCIMReference {
     /// path text. Names of classes and keys keep their spelling, which is the declared one if the class is known; of a class that
     /// nobody declared it is the written one, and its letter case counts. TCIMValue::IsSameKey is the same relation without the
     /// texts.
+    ///
+    /// Embedded objects and arrays are exceptions, because a path does not show all that equality by value compares. An embedded
+    /// object and plain text that reads like its key text are different values with one text; so are arrays of such elements. The
+    /// elements of a bag are sorted in the text: it is that of an array in the same order, and a bag may be equal to an array whose
+    /// text is another one. The same holds for bags and arrays within embedded objects.
     std::string GetPath() const;
     /// The same text, appended to `out`.
     void AppendPath(std::string& out) const;
@@ -86,7 +91,8 @@ class CIMDELTA_EXPORT TCIMReference {
     /// double quotes a string. The path gets the class that `ns` declares, and each key of the class its declared spelling and
     /// type, if the value converts without loss; its text is then that of the instance's own path. If `ns` is null or does not
     /// declare the class, the path gets a stub. Errors: TZELException with kParseError (9) if the text is no path; `errorPosition`,
-    /// if not null, then gets the byte offset.
+    /// if not null, then gets the byte offset. Also whatever GetClass of `ns` and GetPropertyDecl of the class throw, except
+    /// kNotFound (15): a delta namespace, for example, throws kMissingParameter (38).
     static TCIMReference Parse(const std::string& text, boost::shared_ptr<ICIMNamespace> ns = boost::shared_ptr<ICIMNamespace>(),
                                std::size_t* errorPosition = nullptr);
 

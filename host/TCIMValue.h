@@ -167,9 +167,9 @@ class CIMDELTA_EXPORT alignas(8) TCIMValue {
     /// Appends the value in the form that it has in a path (see TCIMReference::GetPath).
     void AppendKeyText(std::string& out) const;
 
-    /// Whether both values, as keys of one class, name the same instance: they have the same type and the same key text. Except for
-    /// embedded objects and arrays, this is equality by value, and no text is made. An embedded object is the same key as plain
-    /// text that reads like its key text: a path cannot show the difference.
+    /// Whether both values, as keys of one class, name the same instance: both are null, of any types, or they have the same type
+    /// and the same key text. Except for embedded objects and arrays, this is equality by value, and no text is made. An embedded
+    /// object is the same key as plain text that reads like its key text: a path cannot show the difference.
     bool IsSameKey(const TCIMValue& other) const;
     /// The same for values that are the same key.
     std::size_t KeyHash() const;

@@ -5,8 +5,8 @@
 // Equal objects must have equal texts, and different ones different texts. So names are in lower case and elements are sorted by
 // name; what equality ignores is left out, and what it compares is there (TEmbeddedObject.cpp lists both). Attributes are left out
 // only if they are empty or zero. Text is escaped in place, so it cannot be taken for an element. Bytes that XML does not allow
-// stay as they are: this text is compared and shown, not parsed. Values are written as in keys, without quotes; objects and arrays
-// nest as elements.
+// stay as they are: this text is compared and shown, not parsed. Values are written as in keys; text, datetimes and references are
+// without their double quotes, char16 keeps its single ones. Objects and arrays nest as elements.
 
 #include <algorithm>
 

@@ -317,6 +317,41 @@ TEST(KeyIdentityTest, TextThatReadsLikeAnObjectIsTheSameKeyThoughNotEqual)
     EXPECT_FALSE(object.IsSameKey(TCIMValue::Null(TType::kString)));
 }
 
+TEST(KeyIdentityTest, ArraysOfObjectsAndOfTextsThatReadLikeThemAreTheSameKeyThoughNotEqual)
+{
+    const TCIMValue object = Embedded("Setting", {Member("Size", TCIMValue(1))});
+    const TCIMValue objects = ListOf({object});
+    const TCIMValue texts = ListOf({TCIMValue(object.GetEmbeddedObject()->GetKeyText())});
+    EXPECT_NE(objects, texts);
+    EXPECT_TRUE(objects.IsSameKey(texts));
+    EXPECT_EQ(TextOfKey(objects), TextOfKey(texts));
+    EXPECT_EQ(objects.KeyHash(), texts.KeyHash());
+}
+
+TEST(KeyIdentityTest, ABagIsTheSameKeyAsTheSortedArrayThoughEqualToAnyOrder)
+{
+    const TCIMValue sorted = ListOf({TCIMValue("a"), TCIMValue("b")});
+    const TCIMValue turned = ListOf({TCIMValue("b"), TCIMValue("a")});
+    for (const auto& [bag, same, other] :
+         {std::tuple(turned.AsBag(), sorted, turned),
+          std::tuple(Embedded("C", {Member("L", turned.AsBag())}), Embedded("C", {Member("L", sorted)}),
+                     Embedded("C", {Member("L", turned)}))}) {
+        EXPECT_EQ(TextOfKey(bag), TextOfKey(same));
+        EXPECT_TRUE(bag.IsSameKey(same));
+        EXPECT_EQ(bag, other);
+        EXPECT_NE(TextOfKey(bag), TextOfKey(other));
+        EXPECT_FALSE(bag.IsSameKey(other));
+    }
+}
+
+TEST(KeyIdentityTest, NullsOfAllTypesAreTheSameKey)
+{
+    EXPECT_TRUE(TCIMValue().IsSameKey(TCIMValue::Null(TType::kUint8)));
+    EXPECT_TRUE(TCIMValue::Null(TType::kString).IsSameKey(TCIMValue::Null(TType::kUint8)));
+    EXPECT_EQ(TCIMValue::Null(TType::kString).KeyHash(), TCIMValue::Null(TType::kUint8).KeyHash());
+    EXPECT_FALSE(TCIMValue::Null(TType::kString).IsSameKey(TCIMValue("NULL")));
+}
+
 TEST(KeyIdentityTest, ValuesForPeopleStayAsTheyWereWritten)
 {
     TCIMReference path = TCIMReference::Parse("//WEB01/root/PG_InterOp:Event");
