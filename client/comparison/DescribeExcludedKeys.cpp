@@ -3,11 +3,12 @@
 //   instances     Several of one inventory may have the same key. Of those of the reference the first stands for the key, and the
 //                 others are not compared. Each one of another inventory is compared with that first one; if the reference has
 //                 none with the key, one difference stands for them all.
-//   references    The same keys, and the namespace, are left out of each pair of references that is compared. Which class they
-//   refer
-//                 to does not matter, so two references to different instances may count as equal.
+//   references    The same keys, and the namespace, are left out of each pair of references that is compared, whatever class
+//                 declares the keys. Two references to different instances may therefore count as equal.
 //
-// A pair of references is compared only if the instances that hold them have the same key and neither is null.
+// A pair of references is compared only if the instances that hold them have the same key and neither is null. Usually one of the
+// two is the reference's. If that lacks the key, the instances of the others are compared with one another (see
+// TDifferenceReader.cpp).
 #include "client/comparison/DescribeExcludedKeys.h"
 
 #include <algorithm>
@@ -17,6 +18,7 @@
 #include "client/comparison/TInstanceIndex.h"
 #include "client/inventory/CollectObjects.h"
 #include "client/inventory/PropertyValue.h"
+#include "embedded/store/TInMemInstance.h"
 #include "host/TCIMReference.h"
 
 namespace NORVZEL20 {
@@ -38,6 +40,10 @@ class TExcludedKeys {
             CountSharing(other, i, reference);
             FindReferences({inventories[0].ns, inventories[i].ns}, compared);
             MatchReferences(other, reference);
+            CollectAlone(other, reference);
+        }
+        for (const auto& [key, instances] : fAlone) {
+            MatchReferencesAmong(instances, compared);
         }
         Keep(fKeysInReferences, fClass.referenceKeys);
     }
@@ -108,6 +114,32 @@ class TExcludedKeys {
         }
     }
 
+    void CollectAlone(const TInstanceIndex& other, const TInstanceIndex& reference)
+    {
+        for (const auto& [key, instances] : other.GetAll()) {
+            if (reference.Find(key).empty()) {
+                TInstanceIndex::TInstances& alone = fAlone[key];
+                alone.insert(alone.end(), instances.begin(), instances.end());
+            }
+        }
+    }
+
+    void MatchReferencesAmong(const TInstanceIndex::TInstances& instances, const std::vector<std::string>& compared)
+    {
+        for (std::size_t i = 0; instances.size() > 1 && i < compared.size(); ++i) {
+            std::vector<TCIMValue> references;
+            for (const boost::shared_ptr<ICIMInstance>& instance : instances) {
+                const auto& stored = static_cast<const TInMemInstance&>(*instance);  // the client's inventories are in memory
+                if (IsReference(*stored.GetInMemClass(), compared[i]) && !ValueOf(stored, compared[i]).IsNull()) {
+                    references.push_back(ValueOf(stored, compared[i]));
+                }
+            }
+            for (std::size_t reference = 0; references.size() > 1 && reference < references.size(); ++reference) {
+                NoteLeftOut(references[reference]);
+            }
+        }
+    }
+
     void NoteLeftOut(const TCIMReference& path)
     {
         const bool hasPlace = !path.GetNamespaceName().empty() || !path.GetHost().empty();
@@ -135,6 +167,7 @@ class TExcludedKeys {
     TRules& fRules;
     std::vector<std::string> fReferences;     // the reference properties compared between two inventories
     std::set<std::string> fKeysInReferences;  // the excluded keys met in references
+    TInstanceIndex::TByKey fAlone;            // the instances of the others whose key the reference lacks
 };
 
 }  // namespace

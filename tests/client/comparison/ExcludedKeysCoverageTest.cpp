@@ -99,6 +99,56 @@ TEST_F(ExcludedKeysCoverageTest, NothingIsSaidOfReferencesThatWereNotCompared)
               Verdict(MountOf(""), MountOf("", alone), "<class name='Mount' default='include' excludekeys='Name'/>"));
 }
 
+std::string NetworkMount(const std::string& point, const std::string& path)
+{
+    return Instance("NetworkMount", Value("Point", point) + path);
+}
+
+const char kMountsOfAnyDisk[] = "<class name='Mount' default='include' excludekeys='Name'/>";
+
+/// The reference has no such mount, so those of b and c are compared with each other.
+TEST_F(ExcludedKeysCoverageTest, ReferencesAmongTheOthersCountToo)
+{
+    const auto mounts = [this](const std::string& name, const std::string& disk) {
+        const std::string path = disk.empty() ? disk : Reference("Dev", Path("Disk", "Name", disk));
+        return Scratch(name + ".xml", MountOf("", name == "a" ? "" : NetworkMount("/", path)));
+    };
+    const auto verdict = [&](const std::string& first, const std::string& second) {
+        const std::string rules = Scratch("rules", "<DifftoolSpec>" + kSystem + kMountsOfAnyDisk + "</DifftoolSpec>");
+        const std::vector<std::string> command{"compare",       "--spec",           rules,
+                                               mounts("a", ""), mounts("b", first), mounts("c", second)};
+        Run(command);
+        const std::string text = fOut;
+        std::vector<std::string> asJson = command;
+        asJson.insert(asJson.end(), {"-o", "json"});
+        Run(asJson);
+        const nlohmann::json document = nlohmann::json::parse(fOut);
+        const std::size_t at = text.find("\nReferences of ");
+        return (at == std::string::npos ? "\n" : text.substr(at + 1, text.find('\n', at + 1) - at)) +
+               document["coverage"]["classes"][2]["class"].get<std::string>() + " " +
+               document["coverage"]["classes"][2]["referenceKeysLeftOut"].dump() + " " +
+               document["summary"]["everythingCompared"].dump();
+    };
+    const std::string reduced = "References of NetworkMount were compared without key Name and without their namespace.\n"
+                                "NetworkMount [\"Name\"] false";
+    EXPECT_EQ(reduced, verdict("sda", "sdb"));
+    EXPECT_EQ(reduced, verdict("sda", "sda"));
+    EXPECT_EQ("\nNetworkMount [] true", verdict("sda", ""));
+}
+
+TEST_F(ExcludedKeysCoverageTest, ReferencesOfInstancesThatShareAKeyCountToo)
+{
+    const std::string both =
+        NetworkMount("/x", Reference("Dev", ElsewherePath("sda"))) + NetworkMount("/y", Reference("Dev", ElsewherePath("sdb")));
+    EXPECT_EQ("1 difference between a and b: 2 instances only in b\n"
+              "References of NetworkMount were compared without key Name and without their namespace.\n"
+              "Instances of NetworkMount with the key of an earlier one, since the rules leave out Point: 1 of b, reported with "
+              "the earlier one, since a has none with that key.\n"
+              "not everything of 1 and 3\n"
+              "NetworkMount: ignored [\"Point\"] compared [0,2] sharing [0,1] without partner [0,1] reduced [\"Name\"]\n",
+              Verdict(MountOf(""), MountOf("", both), "<class name='NetworkMount' default='include' excludekeys='Point Name'/>"));
+}
+
 /// An inventory with disks in the given places; Bus and Slot identify a disk.
 std::string SlottedDisks(const std::string& instances)
 {
