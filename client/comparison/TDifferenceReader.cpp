@@ -6,7 +6,8 @@
 //                       that have the key differ from one another: the plug-in does not compare these
 //   property changed    the reference's value, and the value of each inventory concerned
 //
-// Inventories with equal values are grouped. Whether values are equal is asked of the plug-in.
+// Inventories with equal values are grouped. Whether values are equal is asked of the plug-in. It lets the declaration of the
+// reference decide whether the order of an array counts, so each value is asked about in the form that the reference would hold.
 //
 // After a run with two inventories the reference holds the other one's values. The embedded host keeps what a property held before
 // its first change; a report shows this earlier value.
@@ -53,6 +54,16 @@ TCIMValue ValueIfDeclared(const ICIMInstance& instance, const std::string& prope
     return FindPropertyDecl(*cls, property) ? ValueBefore(instance, property) : TCIMValue();
 }
 
+// The value as a property declared like this would hold it: an array is a bag if the declaration makes it one, else it is not.
+TCIMValue InFormOf(const TInMemPropertyDecl& declared, const TCIMValue& value)
+{
+    if (declared.IsBag()) {
+        return value.AsBag();
+    }
+    return value.IsBag() ? TCIMValue(value.GetType(), static_cast<unsigned>(value.GetElements().size()), value.GetElements())
+                         : value;
+}
+
 bool StandsBefore(const TDifference& a, const TDifference& b)
 {
     return std::tie(a.className, a.instance, a.kind, a.property) < std::tie(b.className, b.instance, b.kind, b.property);
@@ -79,11 +90,11 @@ void TDifferenceReader::StartClass(const std::string& className)
     fIndexes.clear();
     fIndexes.resize(fInventories.size());
     fByPath.clear();
-    const boost::shared_ptr<ICIMClass> cls = fInventories[0].ns->GetClass(className, TCallContext());
-    fProperties = fRules.PropertiesOf(cls);
+    fClass = fInventories[0].ns->FindClass(className);
+    fProperties = fRules.PropertiesOf(fClass);
     std::sort(fProperties.begin(), fProperties.end());
     fExcludesKeys = !fRules.ExcludedKeysOf(className).empty();
-    fHasKeys = !KeyNamesOf(*cls).empty();
+    fHasKeys = !KeyNamesOf(*fClass).empty();
 }
 
 TDifference TDifferenceReader::Make(const TDeltaRecord& record)
@@ -125,8 +136,7 @@ boost::shared_ptr<ICIMInstance> TDifferenceReader::FindByPath(const std::string&
         return Index(0).Find(path).at(0);
     }
     if (fByPath.empty()) {
-        for (const boost::shared_ptr<ICIMInstance>& instance :
-             InstancesOf(*fInventories[0].ns->GetClass(fClassName, TCallContext()))) {
+        for (const boost::shared_ptr<ICIMInstance>& instance : InstancesOf(*fClass)) {
             fByPath[instance->GetReference(TCallContext()).GetPath()] = instance;
         }
     }
@@ -159,12 +169,13 @@ void TDifferenceReader::AddChange(TDifference& difference, const ICIMInstance& r
     TValueDifference change;
     change.property = difference.property;
     change.reference = ValueBefore(reference, difference.property);
+    const TValueDifference::TEqual areEqual = MakeEqual(*fClass->FindPropertyDecl(change.property));
     for (const std::size_t inventory : difference.inventories) {
         const TInstanceIndex::TInstances& instances = Index(inventory).Find(difference.instance);
         for (const boost::shared_ptr<ICIMInstance>& instance : instances) {
             const TCIMValue value = ValueBefore(*instance, difference.property);
             if (instances.size() == 1 || fRules.Differ(fClassName, change.reference, value)) {
-                change.GetGroup(value, MakeEqual()).Add(inventory, 1);
+                change.GetGroup(value, areEqual).Add(inventory, 1);
             }
         }
     }
@@ -183,19 +194,22 @@ void TDifferenceReader::AddDisagreements(TDifference& difference)
     for (std::size_t i = 0; instances.size() > 1 && i < fProperties.size(); ++i) {
         TValueDifference values;
         values.property = fProperties[i];
+        const TValueDifference::TEqual areEqual = MakeEqual(*fClass->FindPropertyDecl(values.property));
         for (const auto& [inventory, instance] : instances) {
-            values.GetGroup(ValueIfDeclared(*instance, values.property), MakeEqual()).Add(inventory, 1);
+            values.GetGroup(ValueIfDeclared(*instance, values.property), areEqual).Add(inventory, 1);
         }
-        if (values.DoOthersDiffer(MakeEqual())) {
+        if (values.DoOthersDiffer(areEqual)) {
             AddEmbeddedParts(values, false);
             difference.values.push_back(values);
         }
     }
 }
 
-TValueDifference::TEqual TDifferenceReader::MakeEqual() const
+TValueDifference::TEqual TDifferenceReader::MakeEqual(const TInMemPropertyDecl& declared) const
 {
-    return [this](const TCIMValue& one, const TCIMValue& other) { return !fRules.Differ(fClassName, one, other); };
+    return [this, &declared](const TCIMValue& one, const TCIMValue& other) {
+        return !fRules.Differ(fClassName, InFormOf(declared, one), other);
+    };
 }
 
 // The reference lacks the instance of an added key. After a run with two inventories it has a copy, which does not count.

@@ -31,12 +31,13 @@ class TDifferenceReader {
     void AddKeys(TDifference& difference, const ICIMInstance& instance) const;
     void AddChange(TDifference& difference, const ICIMInstance& reference);
     void AddDisagreements(TDifference& difference);
-    TValueDifference::TEqual MakeEqual() const;
+    TValueDifference::TEqual MakeEqual(const TInMemPropertyDecl& declared) const;
     void CountSharing(TDifference& difference);
 
     const std::vector<TInventory>& fInventories;
     TRules& fRules;
     std::string fClassName;
+    boost::shared_ptr<TInMemClass> fClass;                                     // the reference's
     bool fHasKeys = true;                                                      // of the class being read
     bool fExcludesKeys = false;                                                // likewise
     std::vector<std::string> fProperties;                                      // likewise; those compared, ascending
