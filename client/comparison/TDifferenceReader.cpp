@@ -47,11 +47,12 @@ TCIMValue ValueBefore(const ICIMInstance& instance, const std::string& property)
     return earlier == nullptr ? handle->GetValue(TCallContext()) : *earlier;
 }
 
-// The instance's value, or null if its class lacks the property. That is possible with --strict-schema only.
-TCIMValue ValueIfDeclared(const ICIMInstance& instance, const std::string& property)
+// The instance's value, or a null of the type `declared` if its class lacks the property. That is possible with --strict-schema
+// only.
+TCIMValue ValueIfDeclared(const ICIMInstance& instance, const std::string& property, TCIMValue::TCIMType declared)
 {
     const boost::shared_ptr<ICIMClass> cls = instance.GetClass(TCallContext());
-    return FindPropertyDecl(*cls, property) ? ValueBefore(instance, property) : TCIMValue();
+    return FindPropertyDecl(*cls, property) ? ValueBefore(instance, property) : TCIMValue::Null(declared);
 }
 
 // The value as a property declared like this would hold it: an array is a bag if the declaration makes it one, else it is not.
@@ -194,9 +195,10 @@ void TDifferenceReader::AddDisagreements(TDifference& difference)
     for (std::size_t i = 0; instances.size() > 1 && i < fProperties.size(); ++i) {
         TValueDifference values;
         values.property = fProperties[i];
-        const TValueDifference::TEqual areEqual = MakeEqual(*fClass->FindPropertyDecl(values.property));
+        const TInMemPropertyDecl& declared = *fClass->FindPropertyDecl(values.property);
+        const TValueDifference::TEqual areEqual = MakeEqual(declared);
         for (const auto& [inventory, instance] : instances) {
-            values.GetGroup(ValueIfDeclared(*instance, values.property), areEqual).Add(inventory, 1);
+            values.GetGroup(ValueIfDeclared(*instance, values.property, declared.GetType()), areEqual).Add(inventory, 1);
         }
         if (values.DoOthersDiffer(areEqual)) {
             AddEmbeddedParts(values, false);

@@ -70,8 +70,9 @@ TEST_F(DisagreementTest, APropertyThatOneLacksUnderAStrictSchemaIsNull)
 {
     const std::string lacking = Class("User", "", KeyProperty("Name")) + Instance("User", Value("Name", "web"));
     fOptions = {"--strict-schema"};
-    EXPECT_EQ("User\n+ Name=\"web\"  (in b, c)\n    UID: b: uint32 7 / c: none NULL\n",
-              Differences({User(), WithUid("7"), lacking}));
+    EXPECT_EQ("User\n+ Name=\"web\"  (in b, c)\n    UID: b: 7 / c: NULL\n", Differences({User(), WithUid("7"), lacking}));
+    const std::string lines = Lines({User(), WithUid("7"), lacking});
+    EXPECT_NE(std::string::npos, lines.find("{\"inventories\":[\"c\"],\"type\":\"uint32\",\"value\":null}")) << lines;
 }
 
 }  // namespace
