@@ -109,25 +109,24 @@ TComparisonReport TComparison::RunWith(TRules& rules, const TRulesText& text)
 
 void TComparison::FindDifferences(TDeltaNamespace& records, TRules& rules)
 {
-    for (const TInventory& inventory : fInventories) {
-        records.AddNamespaceToCompareList(inventory.ns);
+    std::vector<TInventory> run = fInventories;
+    if (MustKeepReference()) {
+        run.push_back(fInventories.back());
     }
-    // See MustKeepReference: the only other inventory is added twice.
-    const bool addTwice = MustKeepReference();
-    if (addTwice) {
-        records.AddNamespaceToCompareList(fInventories.back().ns);
+    for (const TInventory& inventory : run) {
+        records.AddNamespaceToCompareList(inventory.ns);
     }
     const TLogCapture log;
     try {
         records.FindDifferences();
     } catch (const TZELException& error) {
         ThrowIfOutOfMemory(error);
-        throw TClientError(TComparisonFault{error.GetStatusCode(), error.what(), log.GetMessages(), fStrictSchema}.Describe(
-            fInventories, rules, records));
+        throw TClientError(
+            TComparisonFault{error.GetStatusCode(), error.what(), log.GetMessages(), fStrictSchema}.Describe(run, rules, records));
     } catch (const TAssertionFailure& error) {
         throw TClientError(std::string("the comparison failed: ") + error.what());
     }
-    if (addTwice) {
+    if (run.size() > fInventories.size()) {
         RemovePosition(records, fInventories.size());
     }
     RemoveMadeSystems(records);

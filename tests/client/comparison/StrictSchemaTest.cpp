@@ -69,6 +69,40 @@ TEST_F(StrictSchemaTest, AnInnocentPropertyIsNotNamed)
               message);
 }
 
+/// If a static value differs, the run leaves the reference as it is. What it could not take over is then no cause.
+TEST_F(StrictSchemaTest, AnInnocentPropertyIsNotNamedIfAStaticValueDiffers)
+{
+    const auto document = [](const std::string& shared, const std::string& disks, const std::string& part) {
+        return Document(System() + Class("Host", "", KeyProperty("Id") + Declaration("Site", "string", Qualifier("Static"))) +
+                        Instance("Host", Value("Id", "1") + Value("Site", shared)) + disks + part);
+    };
+    const auto disks = [](const std::string& declared, const std::string& values) {
+        return Class("Disk", "", KeyProperty("Id") + declared) + Instance("Disk", Value("Id", "1") + values);
+    };
+    const std::string on =
+        "<PROPERTY.REFERENCE NAME=\"On\"><VALUE.REFERENCE>" + Path("Disk", "Id", "1") + "</VALUE.REFERENCE></PROPERTY.REFERENCE>";
+    const std::string reference =
+        Class("Part", "", KeyProperty("Id") + "<PROPERTY.REFERENCE NAME=\"On\"/>") + Instance("Part", Value("Id", "1") + on);
+    const std::string text =
+        Class("Part", "", KeyProperty("Id") + Declaration("On", "string")) + Instance("Part", Value("Id", "1") + Value("On", "x"));
+    const std::string number = disks(Declaration("Size", "uint32"), Value("Size", "5", "uint32"));
+    const struct {
+        std::string a;
+        std::string b;
+    } rows[] = {
+        {number, disks(Declaration("Size", "string"), Value("Size", "5"))},
+        {disks("", ""), disks(Declaration("Size", "string"), "") + Instance("Disk", Value("Id", "9") + Value("Size", "5"))},
+    };
+    for (const auto& row : rows) {
+        EXPECT_EQ("cimdelta: the comparison failed: Type mismatch; property On of class Part is reference in a.xml and string in "
+                  "b.xml" +
+                      std::string(kAdvice),
+                  Compare(document("one", row.a, reference), document("two", row.b, text), {"--strict-schema"}));
+        Compare(document("one", row.a, ""), document("two", row.b, ""), {"--strict-schema"});
+        EXPECT_EQ(1, fStatus) << fErr;
+    }
+}
+
 /// The disks that only b has are in the reference when a later class fails.
 TEST_F(StrictSchemaTest, AnInstanceThatWasAddedIsNotNamed)
 {
