@@ -12,12 +12,14 @@
 #include "client/rules/TRulesParser.h"
 
 #include <algorithm>
+#include <boost/algorithm/string/predicate.hpp>
 #include <utility>
 
 #include "client/process/LackOfMemory.h"
 #include "client/process/TClientError.h"
 #include "client/rules/TLogCapture.h"
 #include "embedded/value/TUtf8.h"
+#include "host/TXmlParser.h"
 #include "host/TZELException.h"
 #include "spec/TDiffClassRules.h"
 
@@ -32,6 +34,8 @@ const std::size_t kInRoot = 2;
 const std::size_t kInClass = 3;
 const std::size_t kInList = 4;
 const std::size_t kInValue = 5;
+
+const char kInvalidToken[] = "not well-formed (invalid token)";
 
 TRulesFault MakeFault(TRulesFault::EKind kind, const std::string& text = std::string())
 {
@@ -66,30 +70,42 @@ TRulesFault FindClassFault(const TAttributes& attrs)
     return MakeFault(name == attrs.end() || name->second.empty() ? TRulesFault::kNoClassName : TRulesFault::kUnknownClass);
 }
 
-bool IsUtf8(std::string_view text)
-{
-    while (!text.empty()) {
-        const TUtf8::TCharacter character = TUtf8::Decode(text);
-        if (character.length == 0 || character.code == 0) {
-            return false;
-        }
-        text.remove_prefix(character.length);
+// Reads XML and keeps the reason if it is not well-formed.
+class TXmlReason : public TXmlParser {
+  public:
+    void FatalError(const char* message) override { fReason = message; }
+    const std::string& Find(std::string text)
+    {
+        Parse(text.data(), text.size());
+        return fReason;
     }
-    return true;
+
+  private:
+    std::string fReason;
+};
+
+// Whether the text, which the XML parser could begin to read, is meant to be UTF-8. Of the encodings that are read, the one of 16
+// bits begins with its mark or with an ASCII character, which has a zero byte; the others stand in the XML declaration.
+bool IsMeantAsUtf8(const std::string& text)
+{
+    const std::string start = text.substr(0, 2);
+    if (start == "\xff\xfe" || start == "\xfe\xff" || start.find('\0') != std::string::npos) {
+        return false;
+    }
+    const std::string declaration = text.substr(0, text.find('>'));
+    return !boost::algorithm::icontains(declaration, "iso-8859-1") && !boost::algorithm::icontains(declaration, "us-ascii");
 }
 
-// Whether the XML is refused for its encoding. Bytes that are not UTF-8 make an invalid token, unless the document declares another
-// encoding or begins with the mark of UTF-16.
-bool IsWrongEncoding(const std::string& reason, std::string_view text)
+// Whether the XML is refused for its encoding: its name, a character that the end of the file cuts off, or bytes that are not
+// UTF-8. The latter make an invalid token, as other mistakes do. If one of those comes first, the text before the bytes has it too.
+bool IsWrongEncoding(const std::string& reason, const std::string& text)
 {
-    if (reason.find("encoding") != std::string::npos) {
+    if (reason.find("encoding") != std::string::npos || reason == "partial character") {
         return true;
     }
-    const std::string_view head = text.substr(0, text.find('>'));
-    const bool isOther = head.find("encoding=") != std::string_view::npos && head.find("utf-8") == std::string_view::npos &&
-                         head.find("UTF-8") == std::string_view::npos;
-    const bool isUtf16 = text.substr(0, 2) == "\xff\xfe" || text.substr(0, 2) == "\xfe\xff";
-    return reason == "not well-formed (invalid token)" && !isOther && !isUtf16 && !IsUtf8(text);
+    const std::size_t invalid = TUtf8::FindInvalid(text);
+    return reason == kInvalidToken && invalid < text.size() && IsMeantAsUtf8(text) &&
+           TXmlReason().Find(text.substr(0, invalid)) != kInvalidToken;
 }
 
 }  // namespace

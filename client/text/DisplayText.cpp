@@ -71,7 +71,7 @@ std::string EscapeForDisplay(std::string_view text)
     out.reserve(text.size());
     while (!text.empty()) {
         const TUtf8::TCharacter character = TUtf8::Decode(text);
-        const bool isCharacter = character.length > 0 && !character.IsOverlong() && character.IsScalar();
+        const bool isCharacter = character.IsValid();
         if (!isCharacter) {
             out += "\\x";
             AppendHex(out, static_cast<unsigned char>(text.front()), 2);

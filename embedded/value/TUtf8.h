@@ -30,6 +30,8 @@ class TUtf8 {
         bool IsOverlong() const noexcept { return length > GetLength(code); }
         /// Whether the code is one that Unicode can assign: up to U+10FFFF and no surrogate.
         bool IsScalar() const noexcept { return code <= 0x10FFFF && (code < 0xD800 || code > 0xDFFF); }
+        /// Whether it is a character that the standard allows.
+        bool IsValid() const noexcept { return length > 0 && !IsOverlong() && IsScalar(); }
     };
 
     static bool IsContinuation(char c) noexcept { return (static_cast<unsigned char>(c) & 0xC0U) == 0x80U; }
@@ -53,6 +55,20 @@ class TUtf8 {
             code = code << 6 | (static_cast<unsigned char>(text[i]) & 0x3FU);
         }
         return {code, length};
+    }
+
+    /// Where the first byte stands that begins no valid character; the length of `text` if each character is valid.
+    static std::size_t FindInvalid(std::string_view text) noexcept
+    {
+        std::size_t place = 0;
+        while (place < text.size()) {
+            const TCharacter character = Decode(text.substr(place));
+            if (!character.IsValid()) {
+                return place;
+            }
+            place += character.length;
+        }
+        return place;
     }
 
     /// Appends the shortest form of `code`, which must be below 0x200000. Surrogates are encoded like any other code.

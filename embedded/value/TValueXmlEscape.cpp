@@ -16,7 +16,7 @@ std::size_t GetXmlLength(std::string_view text)
 {
     const TUtf8::TCharacter character = TUtf8::Decode(text);
     const bool isForbidden = character.code == 0xFFFE || character.code == 0xFFFF;
-    return character.IsOverlong() || !character.IsScalar() || isForbidden ? 0 : character.length;
+    return character.IsValid() && !isForbidden ? character.length : 0;
 }
 
 /// Whether `c` is copied as it is, in attributes too.

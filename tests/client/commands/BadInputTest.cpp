@@ -4,14 +4,29 @@ namespace NORVZEL20 {
 namespace {
 
 /// Input that cannot be used: one message that names the place and what to do, exit status 2 and no result.
-class BadInputTest : public TClientFixture {};
+class BadInputTest : public TClientFixture {
+  protected:
+    struct TRow {
+        std::string rules;
+        std::string message;
+    };
 
-TEST_F(BadInputTest, EachUnusableRulesFileGetsOneMessage)
+    /// Expects each of these rules to be refused by compare and by check, with its message, in which R stands for the file.
+    void ExpectRefusals(const std::vector<TRow>& rows)
+    {
+        for (const TRow& row : rows) {
+            SCOPED_TRACE(row.rules);
+            const std::string rules = Scratch("rules", row.rules);
+            const std::string expected = "cimdelta: " + row.message + "\n";
+            EXPECT_EQ(expected, Shorten(Complaint({"compare", "--spec", rules, "web01.xml", "web02.xml"}), rules, "R"));
+            EXPECT_EQ(expected, Shorten(Complaint({"check", rules, "--schema", "web01.xml"}), rules, "R"));
+        }
+    }
+};
+
+TEST_F(BadInputTest, RulesOfAnotherFormAreRefused)
 {
-    const struct {
-        const char* rules;
-        const char* message;
-    } rows[] = {
+    ExpectRefusals({
         {"<difftoolspec/>",
          "R:1: element difftoolspec is not expected here; a file is DifftoolSpec > class > includelist or excludelist > value"},
         {"<DifftoolSpec version='1.1'/>", "R:1: version \"1.1\" of DifftoolSpec is unknown; use \"1.0\""},
@@ -19,24 +34,28 @@ TEST_F(BadInputTest, EachUnusableRulesFileGetsOneMessage)
          "R:1: element DifftoolSpec has an unknown attribute foo; its only attribute is version, at most \"1.0\""},
         {"<DifftoolSpec>\n<clas name='INV_Disk'/></DifftoolSpec>",
          "R:2: element clas is not expected here; a file is DifftoolSpec > class > includelist or excludelist > value"},
-        {"<DifftoolSpec>\n\n<class default='include'/></DifftoolSpec>",
-         "R:3: element class has no name; give it the name of a class of the reference"},
-        {"<DifftoolSpec>\n<class name=''/></DifftoolSpec>",
-         "R:2: element class has no name; give it the name of a class of the reference"},
-        {"<DifftoolSpec>\n<class name='INV_Dsk'/></DifftoolSpec>",
-         "R:2: class INV_Dsk is not declared in the reference; correct the name or remove the element"},
         {"<DifftoolSpec><class name='INV_Disk' default='Include'/></DifftoolSpec>",
          "R:1: default \"Include\" is neither \"include\" nor \"exclude\"; letter case counts"},
         {"<DifftoolSpec><class name='INV_Disk' deflt='include'/></DifftoolSpec>",
          "R:1: element class has an unknown attribute deflt; its attributes are name, default and excludekeys"},
         {"<DifftoolSpec><class name='INV_Disk'><list/></class></DifftoolSpec>",
          "R:1: element list is not expected here; a file is DifftoolSpec > class > includelist or excludelist > value"},
+    });
+}
+
+TEST_F(BadInputTest, NamesInRulesThatTheReferenceLacksAreRefused)
+{
+    ExpectRefusals({
+        {"<DifftoolSpec>\n\n<class default='include'/></DifftoolSpec>",
+         "R:3: element class has no name; give it the name of a class of the reference"},
+        {"<DifftoolSpec>\n<class name=''/></DifftoolSpec>",
+         "R:2: element class has no name; give it the name of a class of the reference"},
+        {"<DifftoolSpec>\n<class name='INV_Dsk'/></DifftoolSpec>",
+         "R:2: class INV_Dsk is not declared in the reference; correct the name or remove the element"},
         {"<DifftoolSpec>\n<class name='INV_Disk'>\n<includelist>\n<value>Sise</value>\n</includelist></class></DifftoolSpec>",
          "R:4: class INV_Disk has no property \"Sise\"; the name counts as it stands between the tags, blanks included"},
         {"<DifftoolSpec><class name='INV_Disk'><includelist><value> Model </value></includelist></class></DifftoolSpec>",
          "R:1: class INV_Disk has no property \" Model \"; the name counts as it stands between the tags, blanks included"},
-        {"<DifftoolSpec>\n<class name='INV_Disk'>\n</DifftoolSpec>", "R:3: mismatched tag; correct the file"},
-        {"<DifftoolSpec>", "R:1: no element found; correct the file"},
         {"<DifftoolSpec><class name=' INV_Disk'/></DifftoolSpec>",
          "R:1: class \" INV_Disk\" is not declared in the reference; correct the name or remove the element"},
         {"<DifftoolSpec><class name='%t %c'/></DifftoolSpec>",
@@ -45,29 +64,55 @@ TEST_F(BadInputTest, EachUnusableRulesFileGetsOneMessage)
          "R:1: class INV_Disk has no property \"\"; the name counts as it stands between the tags, blanks included"},
         {"<DifftoolSpec><class name='&lt;root&gt;'><includelist><value>Name</value></includelist></class></DifftoolSpec>",
          "R:1: class <root> has no property \"Name\"; the name counts as it stands between the tags, blanks included"},
+    });
+}
+
+TEST_F(BadInputTest, FilesThatAreNoRulesAreRefused)
+{
+    ExpectRefusals({
+        {"<DifftoolSpec>\n<class name='INV_Disk'>\n</DifftoolSpec>", "R:3: mismatched tag; correct the file"},
+        {"<DifftoolSpec>", "R:1: no element found; correct the file"},
         {"", "R: the file is empty; rules are an element DifftoolSpec with elements class in it"},
         {" \n\n", "R: the file is empty; rules are an element DifftoolSpec with elements class in it"},
+        {"<DifftoolSpec>\n&<DifftoolSpec>", "R:2: not well-formed (invalid token); correct the file"},
+        {"\x1f\x8b\x08", "R: this file is compressed with gzip; rules are read as plain text only, so decompress it first"},
+        {"\x28\xb5\x2f\xfd", "R: this file is compressed with zstd; rules are read as plain text only, so decompress it first"},
+        {"rules", "R:1: syntax error; correct the file"},
+    });
+}
+
+/// An earlier mistake of another kind on the same line, or an encoding that has every byte, is none of the encoding.
+TEST_F(BadInputTest, OnlyTextThatCannotBeDecodedIsToBeSavedAsUtf8)
+{
+    ExpectRefusals({
         {"<DifftoolSpec>\n<!-- f\xFCr -->\n</DifftoolSpec>",
          "R:2: the text cannot be decoded (not well-formed (invalid token)); save the file as UTF-8"},
         {"<?xml version='1.0' encoding='KOI8-R'?>\n<DifftoolSpec/>",
          "R:1: the text cannot be decoded (unknown encoding); save the file as UTF-8"},
         {"<?xml version='1.0' encoding='UTF-16'?>\n<DifftoolSpec/>",
          "R:1: the text cannot be decoded (encoding specified in XML declaration is incorrect); save the file as UTF-8"},
-        {"<DifftoolSpec>\n&<DifftoolSpec>", "R:2: not well-formed (invalid token); correct the file"},
+        {"<?xml version='1.0' encoding='Utf-8'?><DifftoolSpec>\xFC</DifftoolSpec>",
+         "R:1: the text cannot be decoded (not well-formed (invalid token)); save the file as UTF-8"},
+        {"<DifftoolSpec>\n<!-- \xE0\x80\xAF -->\n</DifftoolSpec>",
+         "R:2: the text cannot be decoded (not well-formed (invalid token)); save the file as UTF-8"},
+        {"<DifftoolSpec>\n\n<!-- \xED\xA0\x80 -->\n</DifftoolSpec>",
+         "R:3: the text cannot be decoded (not well-formed (invalid token)); save the file as UTF-8"},
+        {"<DifftoolSpec>\n<!-- gr\xC3\xBC\xC3\x9F \xFC --> & </DifftoolSpec>",
+         "R:2: the text cannot be decoded (not well-formed (invalid token)); save the file as UTF-8"},
+        {"<DifftoolSpec/>\n\xC3", "R:2: the text cannot be decoded (partial character); save the file as UTF-8"},
         {"<?xml version='1.0' encoding='ISO-8859-1'?><DifftoolSpec>\xFC & </DifftoolSpec>",
          "R:1: not well-formed (invalid token); correct the file"},
-        {"\x1f\x8b\x08", "R: this file is compressed with gzip; rules are read as plain text only, so decompress it first"},
-        {"\x28\xb5\x2f\xfd", "R: this file is compressed with zstd; rules are read as plain text only, so decompress it first"},
-        {"rules", "R:1: syntax error; correct the file"},
-    };
-    int number = 0;
-    for (const auto& row : rows) {
-        SCOPED_TRACE(row.rules);
-        const std::string rules = Scratch(std::to_string(number++), row.rules);
-        const std::string expected = std::string("cimdelta: ") + row.message + "\n";
-        EXPECT_EQ(expected, Shorten(Complaint({"compare", "--spec", rules, "web01.xml", "web02.xml"}), rules, "R"));
-        EXPECT_EQ(expected, Shorten(Complaint({"check", rules, "--schema", "web01.xml"}), rules, "R"));
-    }
+        {"<DifftoolSpec>\n&<x/>\n<!-- f\xFCr -->\n</DifftoolSpec>", "R:2: not well-formed (invalid token); correct the file"},
+        {"<DifftoolSpec>\n& <!-- f\xFCr -->\n</DifftoolSpec>", "R:2: not well-formed (invalid token); correct the file"},
+        {"<DifftoolSpec>\n<!-- f\xFCr --></class>\n</DifftoolSpec>",
+         "R:2: the text cannot be decoded (not well-formed (invalid token)); save the file as UTF-8"},
+        {"<?xml version='1.0' encoding='iso-8859-1'?><DifftoolSpec>&\xA0</DifftoolSpec>",
+         "R:1: not well-formed (invalid token); correct the file"},
+        {std::string("<DifftoolSpec>\0</DifftoolSpec>", 30), "R:1: not well-formed (invalid token); correct the file"},
+        {std::string("<\0\xA0\0", 4), "R:1: not well-formed (invalid token); correct the file"},
+        {std::string("\xFF\xFE<\0&\0", 6), "R:1: not well-formed (invalid token); correct the file"},
+        {"<DifftoolSpec>\xEF\xBF\xBF</DifftoolSpec>", "R:1: not well-formed (invalid token); correct the file"},
+    });
 }
 
 TEST_F(BadInputTest, LongTextFromRulesIsShortened)

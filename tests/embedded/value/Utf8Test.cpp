@@ -53,6 +53,30 @@ TEST(Utf8Test, EachTextBeginsWithItsCharacterOrWithNone)
     }
 }
 
+TEST(Utf8Test, ACharacterIsValidIfTheStandardAllowsIt)
+{
+    for (const char* const valid : {"a", "\xC2\x80", "\xED\x9F\xBF", "\xEF\xBF\xBF", "\xF4\x8F\xBF\xBF"}) {
+        EXPECT_TRUE(TUtf8::Decode(valid).IsValid()) << valid;
+    }
+    for (const char* const invalid : {"\x80", "\xFF", "\xC3", "\xC3(", "\xE0\x80\xAF", "\xED\xA0\x80", "\xF4\x90\x80\x80"}) {
+        EXPECT_FALSE(TUtf8::Decode(invalid).IsValid()) << invalid;
+    }
+}
+
+TEST(Utf8Test, TheFirstInvalidByteIsFound)
+{
+    const struct {
+        std::string_view text;
+        std::size_t place;
+    } rows[] = {
+        {"", 0},     {"abc", 3},          {std::string_view("a\0b", 3), 3}, {"f\xC3\xBCr", 4},         {"f\xFCr", 1},
+        {"\xFC", 0}, {"\xC3\xBC\xC3", 2}, {"ab\xE0\x80\xAFz", 2},           {"ab\xED\xA0\x80\xFF", 2},
+    };
+    for (const auto& row : rows) {
+        EXPECT_EQ(row.place, TUtf8::FindInvalid(row.text)) << row.text;
+    }
+}
+
 TEST(Utf8Test, EveryCodeComesBackFromItsShortestForm)
 {
     for (char32_t code = 0; code <= 0x10FFFF; ++code) {
