@@ -107,8 +107,12 @@ class TCommandLine {
 
     int Run(int argc, const char* const* argv, IConsole& console)
     {
-        std::vector<std::string> arguments(argv + 1, argv + argc);
+        std::vector<std::string> arguments(argv + std::min(argc, 1), argv + argc);  // argv may lack even the program's name
         if (!arguments.empty() && arguments.front() == "help") {
+            arguments.erase(std::remove_if(arguments.begin() + 1, arguments.end(), &IsHelpOption), arguments.end());
+            if (const std::string extra = ExtraArgumentOfHelp(arguments); !extra.empty()) {
+                return Refuse("The following argument was not expected: " + extra + "; see cimdelta --help", console);
+            }
             arguments = HelpAsOption(arguments);
         }
         const std::string wrong = arguments.empty() ? std::string() : WrongCommand(arguments.front());
@@ -134,10 +138,19 @@ class TCommandLine {
 
     static void AddVersion(CLI::App& app) { app.set_version_flag("--version", std::string("cimdelta ") + CIMDELTA_VERSION); }
 
+    static bool IsHelpOption(const std::string& argument) { return argument == "--help" || argument == "-h"; }
+
+    // "help" takes one command, and no option but its own. The first argument that it does not take; empty if there is none.
+    static std::string ExtraArgumentOfHelp(const std::vector<std::string>& arguments)
+    {
+        const std::size_t taken = arguments.size() > 1 && IsOption(arguments[1]) ? 1 : 2;
+        return arguments.size() > taken ? arguments[taken] : std::string();
+    }
+
     // "help" is "--help", and "help compare" is "compare --help".
     static std::vector<std::string> HelpAsOption(const std::vector<std::string>& arguments)
     {
-        const bool isGeneral = arguments.size() == 1 || arguments[1] == "help" || IsOption(arguments[1]);
+        const bool isGeneral = arguments.size() == 1 || arguments[1] == "help";
         return isGeneral ? std::vector<std::string>{"--help"} : std::vector<std::string>{arguments[1], "--help"};
     }
 
@@ -153,13 +166,15 @@ class TCommandLine {
     // What is wrong with the first argument if it is neither an option nor a command; empty if nothing is.
     std::string WrongCommand(const std::string& first) const
     {
-        const std::vector<std::string> names = CommandNames();
+        std::vector<std::string> names = CommandNames();
         if (first.empty() || IsOption(first) || std::find(names.begin(), names.end(), first) != names.end()) {
             return std::string();
         }
+        names.push_back("help");
         const std::string nearest = NearestWord(first, names);
         return first + " is no command; " +
-               (nearest.empty() ? "name one: " + Alternatives(names) + "; see cimdelta --help" : "did you mean " + nearest + "?");
+               (nearest.empty() ? "name one: " + Alternatives(CommandNames()) + "; see cimdelta --help"
+                                : "did you mean " + nearest + "?");
     }
 
     // The message about an option that its command does not have; empty if there is none.

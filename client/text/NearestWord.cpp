@@ -27,13 +27,19 @@ std::size_t CountSlips(const std::string& a, const std::string& b)
     return table[a.size()][b.size()];
 }
 
+std::size_t CountWithoutDashes(const std::string& word)
+{
+    const std::size_t first = word.find_first_not_of('-');
+    return first == std::string::npos ? 0 : word.size() - first;
+}
+
 }  // namespace
 
 std::string NearestWord(const std::string& typed, const std::vector<std::string>& words)
 {
     // Longer texts are near no word, and the table for them would be large.
     const std::size_t longest = 40;
-    if (typed.size() < 2 || typed.size() > longest) {
+    if (CountWithoutDashes(typed) < 2 || typed.size() > longest) {
         return std::string();
     }
     std::string nearest;
@@ -43,7 +49,7 @@ std::string NearestWord(const std::string& typed, const std::vector<std::string>
             return word;
         }
         const std::size_t slips = CountSlips(typed, word);
-        if (slips <= word.size() / 3 && slips < fewest) {
+        if (slips <= CountWithoutDashes(word) / 3 && slips < fewest) {
             nearest = word;
             fewest = slips;
         }

@@ -17,6 +17,8 @@ TEST_F(UsageTest, HelpIsACommandToo)
         const std::string help = Result({command, "--help"});
         EXPECT_NE(std::string::npos, help.find(std::string("Usage: cimdelta ") + command)) << help;
         EXPECT_EQ(help, Result({"help", command}));
+        EXPECT_EQ(help, Result({"help", command, "--help"}));
+        EXPECT_EQ(help, Result({"help", "-h", command}));
         EXPECT_NE(general, help);
     }
 }
@@ -42,6 +44,13 @@ TEST_F(UsageTest, WrongUsageIsReportedInOneLine)
         {{"compar", "web01.xml", "web02.xml"}, "compar is no command; did you mean compare?"},
         {{"compar", "--help"}, "compar is no command; did you mean compare?"},
         {{"help", "shwo"}, "shwo is no command; did you mean show?"},
+        {{"hlep"}, "hlep is no command; did you mean help?"},
+        {{"help", "hlep"}, "hlep is no command; did you mean help?"},
+        {{"help", "compare", "show"}, "The following argument was not expected: show; see cimdelta --help"},
+        {{"help", "help", "show", "check"}, "The following argument was not expected: show; see cimdelta --help"},
+        {{"help", "--nonsense"}, "The following argument was not expected: --nonsense; see cimdelta --help"},
+        {{"help", "compare", "--nonsense"}, "The following argument was not expected: --nonsense; see cimdelta --help"},
+        {{"compare", "--self", "web01.xml", "web02.xml"}, "--self is no option of cimdelta compare; see cimdelta compare --help"},
         {{"help", "merge"}, std::string("merge is no command; name one: ") + kCommands},
         {{"web01.xml", "web02.xml"}, std::string("web01.xml is no command; name one: ") + kCommands},
         {{"--verson"}, "--verson is no option of cimdelta; did you mean --version?"},
@@ -64,6 +73,15 @@ TEST_F(UsageTest, WrongUsageIsReportedInOneLine)
     for (const auto& row : rows) {
         EXPECT_EQ("cimdelta: " + row.message + "\n", Complaint(row.arguments));
     }
+}
+
+/// A program may start another one without even a name.
+TEST_F(UsageTest, WithoutAnyArgumentACommandIsAskedFor)
+{
+    TFakeConsole console;
+    EXPECT_EQ(2, RunClient(0, nullptr, console));
+    EXPECT_EQ("", console.fOut);
+    EXPECT_EQ("cimdelta: name a command: compare, check, explain, query or show; see cimdelta --help\n", console.fErr);
 }
 
 }  // namespace

@@ -30,11 +30,16 @@ TEST(NearestWord, IsWhatWasProbablyMeant)
         {"SHOW", ""},
         {"--ouput", "--output"},
         {"--strict", "--strict-schema"},
+        {"--sr", ""},
+        {"--s", ""},
+        {"--self", ""},
+        {"--halp", "--help"},
+        {"-help", "--help"},
         {"--comparewithnothingelse", ""},
     };
     for (const auto& row : rows) {
         EXPECT_EQ(row.nearest,
-                  NearestWord(row.typed, {"compare", "check", "explain", "query", "show", "--output", "--strict-schema"}))
+                  NearestWord(row.typed, {"compare", "check", "explain", "query", "show", "--output", "--strict-schema", "--help"}))
             << row.typed;
     }
 }
