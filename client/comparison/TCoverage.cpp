@@ -1,7 +1,6 @@
 #include "client/comparison/TCoverage.h"
 
 #include <algorithm>
-#include <numeric>
 
 #include "provider/DeltaNames.h"
 
@@ -30,7 +29,7 @@ bool IsWhole(const TCoverage::TClass& cls, bool timesCount)
 
 bool TCoverage::TClass::HasOwnInstances() const
 {
-    return std::accumulate(instances.begin(), instances.end(), static_cast<std::size_t>(0)) > madeIn.size();
+    return HasAny(instances);
 }
 
 bool TCoverage::TClass::IsCompared() const

@@ -19,12 +19,13 @@ struct TCoverage {
         kOperatingSystemMade,  ///< the client made so many instances of KALMO_OperatingSystem that no real ones meet
     };
 
-    /// One class that has instances in at least one inventory. Counts are of this class alone, one for each inventory.
+    /// One class that has instances in at least one inventory, or for which the client made some. Counts are of this class alone,
+    /// one for each inventory, without made instances.
     struct TClass {
         std::string name;
         EState state = kCompared;
         std::vector<std::size_t> instances;
-        std::vector<std::size_t> madeIn;         ///< positions of the inventories whose one instance the client made
+        std::vector<std::size_t> madeIn;         ///< positions of the inventories that have only the one that the client made
         std::vector<std::size_t> compared;       ///< those of the inventory that the comparison looked for in the others
         std::vector<std::string> leftOut;        ///< properties not compared, ascending; empty unless the state is kCompared
         std::vector<std::string> excludedKeys;   ///< in the order of the rules, also those that are no keys of the class

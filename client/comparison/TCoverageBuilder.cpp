@@ -12,7 +12,6 @@
 #include "client/comparison/TCoverageBuilder.h"
 
 #include <algorithm>
-#include <numeric>
 
 #include "client/comparison/DescribeExcludedKeys.h"
 #include "client/inventory/UncomparedSystems.h"
@@ -45,14 +44,17 @@ void TCoverageBuilder::AddClass(TCoverage& coverage, const std::string& classNam
     TCoverage::TClass cls;
     cls.name = className;
     cls.instances = CountInstances(className);
-    if (std::accumulate(cls.instances.begin(), cls.instances.end(), static_cast<std::size_t>(0)) == 0) {
+    if (TNameText::Equal(className, kOperatingSystemClass)) {
+        cls.madeIn = FindMadeSystems(fNotes);
+    }
+    for (const std::size_t inventory : cls.madeIn) {
+        --cls.instances[inventory];
+    }
+    if (!cls.HasOwnInstances() && cls.madeIn.empty()) {
         ++coverage.classesWithout;
         return;
     }
     const std::vector<std::size_t> none(fInventories.size(), 0);
-    if (TNameText::Equal(className, kOperatingSystemClass)) {
-        cls.madeIn = FindMadeSystems(fNotes);
-    }
     cls.compared = cls.sharing = cls.sharingAlone = none;
     cls.state = Describe(cls);
     if (cls.state == TCoverage::kCompared) {
@@ -91,14 +93,11 @@ TCoverage::EState TCoverageBuilder::WhyNothingIsCompared(const TCoverage::TClass
     return hasOthers ? TCoverage::kExcludedByRules : TCoverage::kNothingToCompare;
 }
 
-// Of the reference's instances with the same key only the first is compared. A made one is not the inventory's.
+// Of the reference's instances with the same key only the first is compared.
 void TCoverageBuilder::CountCompared(TCoverage::TClass& cls) const
 {
     cls.compared = cls.instances;
     cls.compared[0] -= cls.sharing[0];
-    for (const std::size_t inventory : cls.madeIn) {
-        cls.compared[inventory] = 0;
-    }
 }
 
 // The properties of all inventories count: with --strict-schema, others may declare some that the reference does not.

@@ -95,7 +95,7 @@ class TStatement {
         std::vector<std::string> classes;
         for (const TCoverage::TClass& cls : fCoverage.classes) {
             if (cls.state == state) {
-                classes.push_back(EscapeForDisplay(cls.name) + " (" + Counts(cls.instances) + ")");
+                classes.push_back(EscapeForDisplay(cls.name) + (cls.HasOwnInstances() ? " (" + Counts(cls.instances) + ")" : ""));
             }
         }
         if (!classes.empty()) {

@@ -78,7 +78,7 @@ class Checker:
         counts = self.comparison.count(name)
         made = [label for label, count in zip(self.labels, counts) if not count and name == inventory.OPERATING_SYSTEM]
         yield from self.fault(name, "madeIn", covered.get("madeIn", []), made)
-        yield from self.fault(name, "instances", covered["instances"], [max(count, label in made) for label, count in zip(self.labels, counts)])
+        yield from self.fault(name, "instances", covered["instances"], counts)
         if covered["state"] != "compared":
             return
         properties = self.comparison.properties(name)

@@ -230,7 +230,7 @@ TEST_F(CompareTest, WhatAnotherInventoryDeclaresIsDeclaredAndReported)
               "\n"
               "Compared: 5 classes; 5 instances of web01, 5 instances of other-schema.\n"
               "2 classes have no instances in any inventory.\n"
-              "Not compared, because cimdelta made the instance of other-schema: KALMO_OperatingSystem (1 / 1).\n"
+              "Not compared, because cimdelta made the instance of other-schema: KALMO_OperatingSystem (1 / 0).\n"
               "Declared in web01 as in other-schema: class ACME_OperatingSystem, class CIM_OperatingSystem, class INV_Extra, "
               "INV_Package.Vendor.\n"
               "Declared in other-schema as in web01: class INV_Disk, class INV_Element, INV_Package.Depends, class INV_Service.\n"
@@ -250,7 +250,7 @@ TEST_F(CompareTest, InventoriesWithoutOperatingSystemAreCompleteAllTheSame)
               "\n"
               "Compared: 3 classes; 5 instances of other-schema, 5 instances of A.\n"
               "1 class has no instances in any inventory.\n"
-              "Not compared, because cimdelta made it: KALMO_OperatingSystem (1 / 1).\n"
+              "Not compared, because cimdelta made it: KALMO_OperatingSystem.\n"
               "Made in other-schema: an instance of KALMO_OperatingSystem.\n"
               "Made in A: an instance of KALMO_OperatingSystem.\n",
               Shorten(fOut, again.substr(again.rfind('/') + 1, again.size() - again.rfind('/') - 5), "A"));

@@ -76,10 +76,32 @@ TEST_F(MadeSystemTest, RulesThatIncludeTheClassChangeNothing)
 TEST_F(MadeSystemTest, JsonSaysWhereItIsNotCompared)
 {
     const std::string report = Report({fFirst, fSecond, fThird}, {"-o", "ndjson"});
-    EXPECT_NE(std::string::npos, report.find("{\"class\":\"KALMO_OperatingSystem\",\"state\":\"compared\",\"instances\":[1,1,1],"))
+    EXPECT_NE(std::string::npos, report.find("{\"class\":\"KALMO_OperatingSystem\",\"state\":\"compared\",\"instances\":[1,1,0],"))
         << report;
     EXPECT_NE(std::string::npos, report.find(",\"madeIn\":[\"c\"]")) << report;
     EXPECT_NE(std::string::npos, report.find("\"everythingCompared\":false")) << report;
+}
+
+TEST_F(MadeSystemTest, OnlyInstancesOfTheInventoriesAreCounted)
+{
+    const std::string fourth = Scratch("d.xml", ReadFile(fThird));
+    const struct {
+        std::vector<std::string> inventories;
+        const char* text;
+        const char* json;
+    } rows[] = {
+        {{fFirst, fThird}, "made the instance of c: KALMO_OperatingSystem (1 / 0).\n", "[1,0]"},
+        {{fThird, fFirst, fSecond}, "made the instance of c: KALMO_OperatingSystem (0 / 1 / 1).\n", "[0,1,1]"},
+        {{fThird, fourth}, "made it: KALMO_OperatingSystem.\n", "[0,0]"},
+    };
+    for (const auto& row : rows) {
+        const std::string report = Report(row.inventories);
+        EXPECT_NE(std::string::npos, report.find("\nNot compared, because cimdelta " + std::string(row.text))) << report;
+        const std::string lines = Report(row.inventories, {"-o", "ndjson"});
+        EXPECT_NE(std::string::npos, lines.find("{\"class\":\"KALMO_OperatingSystem\",\"state\":\"madeByCimdelta\",\"instances\":" +
+                                                std::string(row.json) + ","))
+            << lines;
+    }
 }
 
 TEST_F(MadeSystemTest, NoRecordNamesTheInventory)
@@ -89,21 +111,19 @@ TEST_F(MadeSystemTest, NoRecordNamesTheInventory)
               Result({"query", "-o", "ndjson", "SELECT NamespaceIndices FROM KALMO_Delta", records}));
 }
 
-/// Two made instances beside one real one: nothing is left to compare.
-TEST_F(MadeSystemTest, WhereOnlyOneIsRealTheClassIsNotCompared)
+TEST_F(MadeSystemTest, IfTheReferenceOrAllOthersHaveNoneTheClassIsNotCompared)
 {
     const std::string rules = Including();
     const std::vector<std::vector<std::string>> sets{
         {fFirst, fThird}, {fThird, fFirst}, {fThird, fFirst, fSecond}, {fFirst, fThird, Scratch("d.xml", ReadFile(fThird))}};
     for (const std::vector<std::string>& inventories : sets) {
-        for (const std::vector<std::string>& options :
-             {std::vector<std::string>{"--allow-empty"}, {"--allow-empty", "--spec", rules}}) {
+        for (const std::vector<std::string>& options : {std::vector<std::string>(), {"--spec", rules}}) {
             const std::string report = Report(inventories, options);
             EXPECT_EQ("Nothing was compared between", report.substr(0, 28));
             EXPECT_NE(std::string::npos, report.find("\nNot compared, because cimdelta made the instance of ")) << report;
             EXPECT_EQ(std::string::npos, report.find("Version")) << report;
         }
-        const std::string records = Scratch("records.xml", Report(inventories, {"--allow-empty", "--spec", rules, "-o", "cimxml"}));
+        const std::string records = Scratch("records.xml", Report(inventories, {"--spec", rules, "-o", "cimxml"}));
         for (const std::string record : {"KALMO_Delta", "KALMO_DeltaClass", "KALMO_DeltaClassAssocToDelta"}) {
             EXPECT_EQ("", Result({"query", "-o", "ndjson", "SELECT * FROM " + record, records}));
         }
