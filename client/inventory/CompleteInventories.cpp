@@ -30,9 +30,9 @@ std::vector<TSchemaNote> CompleteInventories(std::vector<TInventory>& inventorie
         console.Say("cimdelta: " + inventories[note.inventory].path + ": has no instance of " + kOperatingSystemClass +
                     ", which a comparison needs; one was made");
     }
-    std::vector<TSchemaNote> schema = FindSchemaDifferences(inventories, false);
-    const std::vector<TSchemaNote> completed = TSchemaCompletion(inventories).Run();
-    schema.insert(schema.end(), completed.begin(), completed.end());
+    std::vector<TSchemaNote> schema = TSchemaCompletion(inventories).Run();
+    const std::vector<TSchemaNote> differences = FindSchemaDifferences(inventories, schema);
+    schema.insert(schema.end(), differences.begin(), differences.end());
     SortNotes(schema);
     notes.insert(notes.end(), schema.begin(), schema.end());
     return notes;
@@ -40,7 +40,7 @@ std::vector<TSchemaNote> CompleteInventories(std::vector<TInventory>& inventorie
 
 std::vector<TSchemaNote> InspectInventories(const std::vector<TInventory>& inventories)
 {
-    std::vector<TSchemaNote> notes = FindSchemaDifferences(inventories, true);
+    std::vector<TSchemaNote> notes = FindSchemaDifferencesAndSpelling(inventories);
     SortNotes(notes);
     return notes;
 }
