@@ -13,7 +13,7 @@ class TCimXmlObjectReader;
 
 /// A property, a qualifier or a qualifier's declaration while its value is read. One item serves many elements in turn.
 ///
-/// Order of calls: Begin; for a simple value BeginValue and then SetText or SetReference; for an array BeginArray, any number of
+/// Order of calls: Begin; for a simple value BeginValue and then SetText, SetReference or, for a null, nothing; for an array BeginArray, any number of
 /// AddText, AddReference and AddNull, EndArray; at last Take. Without a value, Take returns a typed null.
 /// Errors: fail through the context with the status that each operation names; the load then ends.
 class TCimXmlItem {

@@ -1,8 +1,7 @@
 // From XML events to classes and instances.
 //
 // The reader keeps a stack of open elements, each with its state. When an element starts, TCimXmlTable says by the state and the
-// element which state comes next and which action to do; when it ends, the state alone says which action to do. The actions put
-// together what the elements describe:
+// element which state comes next and which action to do; when it ends, the state alone says the action. The actions put together:
 //
 //     object paths             TCimXmlPathReader
 //     values                   TCimXmlItem (of a property, or of a qualifier, which TCimXmlQualifierReader reads)
@@ -97,7 +96,7 @@ void TCimXmlReader::Begin(TTable::EAction action, const TCimXmlAttributes& attri
     switch (action) {
     case TTable::kBeginProperty:
         return BeginProperty(attributes);
-    case TTable::kBeginText:
+    case TTable::kBeginValue:
         return BeginValue();
     case TTable::kBeginArray:
         return fItem->BeginArray(GetState() == TTable::kReferenceArray);
@@ -107,6 +106,9 @@ void TCimXmlReader::Begin(TTable::EAction action, const TCimXmlAttributes& attri
         return BeginInstance(attributes);
     case TTable::kBeginObject:
         return BeginObject();
+    case TTable::kBeginReferenceValue:
+        fItem->BeginValue();
+        return fPaths.Begin();
     case TTable::kBeginReference:
         return fPaths.Begin();
     case TTable::kReadClassName:
@@ -290,8 +292,7 @@ void TCimXmlReader::BeginProperty(const TCimXmlAttributes& attributes)
         fDraft.BeginProperty(name, attributes);
     }
     const TType type = ReadPropertyType(attributes);
-    // In a draft, unmarked text stays text: the class that could declare it an object is not known yet (see
-    // TCimXmlInstanceBuilder::Fill).
+    // In a draft, unmarked text stays text: its class is not known yet (see TCimXmlInstanceBuilder::Fill).
     TCimXmlItem::EText text = TCimXmlItem::kPlain;
     if (type.GetElementType() == TType::kString) {
         if (IsMarkedEmbedded(attributes)) {

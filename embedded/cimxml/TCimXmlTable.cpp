@@ -10,7 +10,7 @@
 //     state       element     next state   action at its start   action at its end
 //     kObject     INSTANCE    kInstance    kBeginInstance        kEndInstance
 //     kInstance   PROPERTY    kProperty    kBeginProperty        kEndProperty
-//     kProperty   VALUE       kText        kBeginText            kEndText
+//     kProperty   VALUE       kText        kBeginValue           kEndText
 //
 // Elements that mean the same share a state: all groups of declarations are kGroup, all kinds of VALUE.OBJECT are kObject. An
 // element without a row is an error, and the rows of the state are then what the message lists as expected. The rows are expanded
@@ -125,27 +125,27 @@ constexpr TRow kRows[] = {
     {T::kInstance, E::kPropertyReference, T::kPropertyReference, T::kBeginProperty},
     {T::kInstance, E::kPropertyRefArray, T::kPropertyArray, T::kBeginProperty},
     {T::kProperty, E::kQualifier, T::kQualifier, T::kBeginQualifier},
-    {T::kProperty, E::kValue, T::kText, T::kBeginText},
-    {T::kProperty, E::kValueNull, T::kNull, T::kNothing},
+    {T::kProperty, E::kValue, T::kText, T::kBeginValue},
+    {T::kProperty, E::kValueNull, T::kNull, T::kBeginValue},
     {T::kPropertyArray, E::kQualifier, T::kQualifier, T::kBeginQualifier},
     {T::kPropertyArray, E::kValueArray, T::kArray, T::kBeginArray},
     {T::kPropertyArray, E::kValueRefArray, T::kReferenceArray, T::kBeginArray},
-    {T::kPropertyArray, E::kValueNull, T::kNull, T::kNothing},
+    {T::kPropertyArray, E::kValueNull, T::kNull, T::kBeginValue},
     {T::kPropertyReference, E::kQualifier, T::kQualifier, T::kBeginQualifier},
-    {T::kPropertyReference, E::kValueReference, T::kReference, T::kBeginReference},
-    {T::kPropertyReference, E::kValueNull, T::kNull, T::kNothing},
+    {T::kPropertyReference, E::kValueReference, T::kReference, T::kBeginReferenceValue},
+    {T::kPropertyReference, E::kValueNull, T::kNull, T::kBeginValue},
     {T::kMethod, E::kQualifier, T::kQualifier, T::kBeginQualifier},
     {T::kMethod, E::kParameter, T::kParameter, T::kBeginParameter},
     {T::kMethod, E::kParameterArray, T::kParameter, T::kBeginParameter},
     {T::kMethod, E::kParameterReference, T::kParameter, T::kBeginParameter},
     {T::kMethod, E::kParameterRefArray, T::kParameter, T::kBeginParameter},
     {T::kParameter, E::kQualifier, T::kQualifier, T::kBeginQualifier},
-    {T::kQualifier, E::kValue, T::kText, T::kBeginText},
+    {T::kQualifier, E::kValue, T::kText, T::kBeginValue},
     {T::kQualifier, E::kValueArray, T::kArray, T::kBeginArray},
     {T::kQualifierDecl, E::kScope, T::kScope, T::kReadScope},
-    {T::kQualifierDecl, E::kValue, T::kText, T::kBeginText},
+    {T::kQualifierDecl, E::kValue, T::kText, T::kBeginValue},
     {T::kQualifierDecl, E::kValueArray, T::kArray, T::kBeginArray},
-    {T::kArray, E::kValue, T::kText, T::kBeginText},
+    {T::kArray, E::kValue, T::kText, T::kBeginValue},
     {T::kArray, E::kValueNull, T::kNull, T::kAddNull},
     {T::kReferenceArray, E::kValueReference, T::kReference, T::kBeginReference},
     {T::kReferenceArray, E::kValueNull, T::kNull, T::kAddNull},

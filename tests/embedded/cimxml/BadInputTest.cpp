@@ -1,6 +1,8 @@
 #include <gtest/gtest.h>
 
+#include <algorithm>
 #include <string>
+#include <vector>
 
 #include "embedded/cimxml/TCimXmlContext.h"
 #include "host/TZELException.h"
@@ -92,6 +94,45 @@ TEST(BadInputTest, EachGetsOneMessageAndLeavesNothing)
         EXPECT_EQ(row.message, loading.ErrorOf(row.document)) << row.what;
         EXPECT_EQ(before, loading.Write()) << row.what;
         EXPECT_EQ(row.status, loading.StatusOf(row.document)) << row.what;
+    }
+}
+
+/// Whatever elements hold the two values, in an instance as in a class, whose properties are read in another way.
+TEST(BadInputTest, APropertyHasOneValue)
+{
+    const std::string text = "<VALUE>1</VALUE>";
+    const std::string null = "<VALUE.NULL/>";
+    const std::string path = "<VALUE.REFERENCE><INSTANCENAME CLASSNAME=\"A\"><KEYBINDING NAME=\"Id\"><KEYVALUE>1</KEYVALUE>"
+                             "</KEYBINDING></INSTANCENAME></VALUE.REFERENCE>";
+    const std::string array = "<VALUE.ARRAY/>";
+    const std::string paths = "<VALUE.REFARRAY/>";
+    const struct {
+        std::string element;
+        std::string attributes;
+        std::vector<std::string> values;
+    } kinds[] = {
+        {"PROPERTY", " TYPE=\"uint8\"", {text, null}},
+        {"PROPERTY.ARRAY", " TYPE=\"uint8\"", {array, null}},
+        {"PROPERTY.REFERENCE", "", {path, null}},
+        {"PROPERTY.REFARRAY", "", {array, paths, null}},
+    };
+    for (const auto& kind : kinds) {
+        const auto property = [&](const std::string& values) {
+            return "<" + kind.element + " NAME=\"N\"" + kind.attributes + ">" + values + "</" + kind.element + ">";
+        };
+        for (const std::string& first : kind.values) {
+            EXPECT_EQ("", TLoading().ErrorOf(L::Group(L::Class("A", property("")) + L::Instance("A", "1", property(first)))));
+            for (const std::string& second : kind.values) {
+                const std::string twice = property(first + second);
+                for (const std::string& contents :
+                     {L::Class("A", twice), L::Class("A", property("")) + L::Instance("A", "1", twice)}) {
+                    const std::string error = TLoading().ErrorOf(L::Group(contents));
+                    EXPECT_EQ(": found a second value for \"N\", expected one",
+                              error.substr(std::min(error.size(), error.find(": "))))
+                        << contents;
+                }
+            }
+        }
     }
 }
 
