@@ -100,7 +100,7 @@ boost::shared_ptr<TInMemNamespace> LoadSample()
 std::string WriteDocument(ICIMNamespace& ns)
 {
     std::string document;
-    TCimXmlWriter([&document](std::string_view piece) { document.append(piece); }).WriteNamespace(ns);
+    TCimXmlWriter([&document](std::string_view piece) { document.append(piece); }).WriteNamespace(ns, "root/written");
     return document;
 }
 

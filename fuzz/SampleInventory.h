@@ -13,7 +13,8 @@ const std::string& GetSampleDocument();
 /// A new namespace that holds the sample document.
 boost::shared_ptr<TInMemNamespace> LoadSample();
 
-/// Writes the namespace as one CIM-XML document.
+/// Writes the namespace as one CIM-XML document. It names a namespace to which no reference points; without a name, the references
+/// that point elsewhere would decide which namespace the document is in.
 std::string WriteDocument(ICIMNamespace& ns);
 
 }  // namespace NORVZEL20
