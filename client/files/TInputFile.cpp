@@ -41,7 +41,12 @@ int OpenFile(const std::string& path)
 
 }  // namespace
 
-TInputFile::TInputFile(const std::string& path) : fName(path == "-" ? "standard input" : path), fDescriptor(OpenFile(path)) {}
+std::string NameOfInput(const std::string& path)
+{
+    return path == "-" ? "standard input" : path;
+}
+
+TInputFile::TInputFile(const std::string& path) : fName(NameOfInput(path)), fDescriptor(OpenFile(path)) {}
 
 TInputFile::~TInputFile()
 {

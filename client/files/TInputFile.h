@@ -7,6 +7,9 @@
 
 namespace NORVZEL20 {
 
+/// What messages call an input: its path, or "standard input" for "-".
+std::string NameOfInput(const std::string& path);
+
 /// The bytes of a file, or of standard input, as they are.
 class TInputFile : public IByteSource {
   public:
@@ -23,7 +26,7 @@ class TInputFile : public IByteSource {
     /// and before Read. Errors: those of Read.
     const std::string& Peek(std::size_t count);
 
-    /// What messages call the file: its path, or "standard input".
+    /// NameOfInput of the file.
     const std::string& GetName() const { return fName; }
 
   private:

@@ -4,15 +4,18 @@
 //     what follows from it                    the plug-in's answers: which properties it compares, which keys it leaves out
 //     which line decides, and what is odd     the trace
 //
-// Whether a property is compared is always the plug-in's answer; the trace only names the reason. In one case no rule is the
-// reason: the plug-in never compares the time of collection if the default is include.
+// Whether a property is compared is the plug-in's answer; the trace only names the reason. In one case no rule is the reason: the
+// plug-in never compares the time of collection if the default is include. And one verdict comes before the plug-in's: if the
+// client made instances of the operating system and no real ones meet, the class is not compared, whatever the rules say.
 //
 // Names come from files and may hold anything, so each line is escaped as a whole.
 #include "client/report/TRulesListing.h"
 
 #include <algorithm>
 #include <boost/algorithm/string/join.hpp>
+#include <numeric>
 
+#include "client/files/TInputFile.h"
 #include "client/inventory/CollectObjects.h"
 #include "client/inventory/RequireClass.h"
 #include "client/inventory/UncomparedSystems.h"
@@ -113,6 +116,10 @@ void TRulesListing::WriteEffective()
 void TRulesListing::WriteEffective(const boost::shared_ptr<TInMemClass>& cls)
 {
     const std::vector<std::string> compared = fRules.PropertiesOf(cls);
+    if (IsNeverCompared(*cls)) {
+        AddLine("  " + cls->GetName() + ": not compared, " + SinceMade());
+        return;
+    }
     if (compared.empty()) {
         AddLine("  " + cls->GetName() + ": not compared");
         return;
@@ -128,7 +135,8 @@ void TRulesListing::WriteEffective(const boost::shared_ptr<TInMemClass>& cls)
             (keys.empty() ? "" : "; matched without " + boost::algorithm::join(keys, ", ")) +
             (fTrace.FindReducedReferences(*cls).empty()
                  ? ""
-                 : "; references compared " + DescribeReducedReferences(fRules.ExcludedKeysOf(cls->GetName()))));
+                 : "; references compared " + DescribeReducedReferences(fRules.ExcludedKeysOf(cls->GetName()))) +
+            (IsPartlyMade(*cls) ? "; " + NotComparedWhereMade() : ""));
 }
 
 void TRulesListing::WriteUnmatched()
@@ -166,6 +174,11 @@ std::string TRulesListing::WriteExplanation(const std::string& className)
     fOut.clear();
     const boost::shared_ptr<TInMemClass> cls = RequireClass(fInventories.front(), className);
     const std::vector<std::string> compared = fRules.PropertiesOf(cls);
+    if (IsNeverCompared(*cls)) {
+        AddLine(cls->GetName() + ": not compared, " + SinceMade());
+        AddVerdicts(*cls, compared);
+        return fOut;
+    }
     const std::vector<std::string> keys = KeysLeftOut(*cls);
     AddLine(cls->GetName() + ": " + (compared.empty() ? "not compared" : "compared") + "; default " +
             Verb(fTrace.Find(cls->GetName()).byDefault.treatment) + ", " + Origin(fTrace.Find(cls->GetName()).byDefault));
@@ -173,10 +186,10 @@ std::string TRulesListing::WriteExplanation(const std::string& className)
         AddLine("  matched without " + boost::algorithm::join(keys, ", ") + " (excludekeys, " + fText.name + ":" +
                 std::to_string(fTrace.Find(cls->GetName()).excludedKeysLine) + ")");
     }
-    AddMadeSystems(*cls, compared);
-    for (const std::string& property : PropertyNames(*cls)) {
-        AddLine("  " + Verdict(*cls, property, compared));
+    if (!compared.empty() && IsPartlyMade(*cls)) {
+        AddLine("  " + NotComparedWhereMade());
     }
+    AddVerdicts(*cls, compared);
     return fOut;
 }
 
@@ -191,23 +204,41 @@ std::string TRulesListing::WriteExplanation(const std::string& className, const 
     }
     const std::vector<std::string> compared = fRules.PropertiesOf(cls);
     AddLine(cls->GetName() + "." + Verdict(*cls, decl->GetName(), compared));
-    AddMadeSystems(*cls, compared);
+    if (Contains(compared, decl->GetName()) && IsPartlyMade(*cls)) {
+        AddLine("  " + NotComparedWhereMade());
+    }
     return fOut;
 }
 
-// Rules cannot include what cimdelta has made.
-void TRulesListing::AddMadeSystems(const TInMemClass& cls, const std::vector<std::string>& compared)
+void TRulesListing::AddVerdicts(const TInMemClass& cls, const std::vector<std::string>& compared)
 {
-    const std::vector<std::size_t> made = FindMadeSystems(fNotes);
-    if (made.empty() || compared.empty() || !TNameText::Equal(cls.GetName(), kOperatingSystemClass)) {
-        return;
+    for (const std::string& property : PropertyNames(cls)) {
+        AddLine("  " + Verdict(cls, property, compared));
     }
-    std::vector<std::string> paths;
-    for (const std::size_t inventory : made) {
-        paths.push_back(fInventories[inventory].path);
-    }
-    AddLine((IsNoSystemCompared(fNotes, fInventories.size()) ? "  not compared at all" : "  not compared in these inventories") +
-            std::string(", since cimdelta made the instance of ") + SomeOf(paths));
+}
+
+// Rules cannot include what cimdelta has made.
+bool TRulesListing::IsNeverCompared(const TInMemClass& cls) const
+{
+    return TNameText::Equal(cls.GetName(), kOperatingSystemClass) && IsNoSystemCompared(fNotes, fInventories.size());
+}
+
+// Whether the class is compared in the inventories that have a real instance only.
+bool TRulesListing::IsPartlyMade(const TInMemClass& cls) const
+{
+    return TNameText::Equal(cls.GetName(), kOperatingSystemClass) && !IsNeverCompared(cls) && !FindMadeSystems(fNotes).empty();
+}
+
+std::string TRulesListing::SinceMade() const
+{
+    const std::vector<std::string> paths = PathsOf(FindMadeSystems(fNotes));
+    return std::string("since cimdelta made the instance") + (paths.size() == 1 ? "" : "s") + " of " + SomeOf(paths);
+}
+
+std::string TRulesListing::NotComparedWhereMade() const
+{
+    const std::vector<std::string> paths = PathsOf(FindMadeSystems(fNotes));
+    return "not compared in " + SomeOf(paths) + ", since cimdelta made " + (paths.size() == 1 ? "its instance" : "their instances");
 }
 
 bool TRulesListing::HasElement(const std::string& className) const
@@ -258,15 +289,25 @@ std::size_t TRulesListing::CountWithSubclasses(const std::string& className) con
 
 std::string TRulesListing::PathsOfInventories() const
 {
+    std::vector<std::size_t> all(fInventories.size());
+    std::iota(all.begin(), all.end(), static_cast<std::size_t>(0));
+    return SomeOf(PathsOf(all));
+}
+
+std::vector<std::string> TRulesListing::PathsOf(const std::vector<std::size_t>& positions) const
+{
     std::vector<std::string> paths;
-    for (const TInventory& inventory : fInventories) {
-        paths.push_back(inventory.path);
+    for (const std::size_t position : positions) {
+        paths.push_back(NameOfInput(fInventories[position].path));
     }
-    return SomeOf(paths);
+    return paths;
 }
 
 std::string TRulesListing::Verdict(const TInMemClass& cls, const std::string& property, const std::vector<std::string>& compared)
 {
+    if (IsNeverCompared(cls)) {
+        return property + ": not compared, " + SinceMade();
+    }
     const bool isCompared = Contains(compared, property);
     const std::vector<std::string> reduced = fTrace.FindReducedReferences(cls);
     const bool isReduced = isCompared && std::find(reduced.begin(), reduced.end(), property) != reduced.end();
@@ -290,8 +331,7 @@ std::string TRulesListing::Reason(const TInMemClass& cls, const std::string& pro
 std::string TRulesListing::Origin(const TRuleTrace::TDecision& decision) const
 {
     if (fText.isMade) {
-        return decision.treatment == TCIMDiffEngine::INCLUDE ? "since everything is compared without --spec"
-                                                             : "since cimdelta made its instance";
+        return "since everything is compared without --spec";
     }
     return decision.fromClass.empty()
                ? "since no element is for this class or one above it"

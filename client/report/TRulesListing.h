@@ -40,12 +40,17 @@ class TRulesListing {
     void WriteEffective(const boost::shared_ptr<TInMemClass>& cls);
     void WriteUnmatched();
     void WriteWarnings();
-    void AddMadeSystems(const TInMemClass& cls, const std::vector<std::string>& compared);
+    void AddVerdicts(const TInMemClass& cls, const std::vector<std::string>& compared);
+    bool IsNeverCompared(const TInMemClass& cls) const;
+    bool IsPartlyMade(const TInMemClass& cls) const;
+    std::string SinceMade() const;
+    std::string NotComparedWhereMade() const;
     bool HasElement(const std::string& className) const;
     std::vector<std::string> KeysLeftOut(const TInMemClass& cls);
     std::size_t CountInstances(const std::string& className) const;
     std::size_t CountWithSubclasses(const std::string& className) const;
     std::string PathsOfInventories() const;
+    std::vector<std::string> PathsOf(const std::vector<std::size_t>& positions) const;
     std::string Verdict(const TInMemClass& cls, const std::string& property, const std::vector<std::string>& compared);
     std::string Reason(const TInMemClass& cls, const std::string& property, bool isCompared) const;
     std::string Origin(const TRuleTrace::TDecision& decision) const;

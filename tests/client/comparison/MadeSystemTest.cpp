@@ -40,6 +40,23 @@ class MadeSystemTest : public TPairFixture {
 
     static std::string FirstLine(const std::string& report) { return report.substr(0, report.find('\n')); }
 
+    /// What a command says about these inventories, in which "R" is the file of Including().
+    std::string OfRules(std::vector<std::string> arguments, const std::vector<std::string>& options,
+                        const std::vector<std::string>& schemas)
+    {
+        arguments.insert(arguments.end(), options.begin(), options.end());
+        for (const std::string& schema : schemas) {
+            arguments.insert(arguments.end(), {"--schema", schema});
+        }
+        Run(arguments);
+        EXPECT_EQ(0, fStatus) << fErr;
+        std::string text = Shorten(fOut, Including(), "R");
+        for (const std::string name : {"a.xml", "b.xml", "c.xml", "d.xml"}) {
+            text = Shorten(text, fFirst.substr(0, fFirst.size() - 5) + name, name);
+        }
+        return text;
+    }
+
     std::string Including()
     {
         return Scratch("rules", "<DifftoolSpec><class name='KALMO_OperatingSystem' default='include'/></DifftoolSpec>");
@@ -130,23 +147,51 @@ TEST_F(MadeSystemTest, IfTheReferenceOrAllOthersHaveNoneTheClassIsNotCompared)
     }
 }
 
-TEST_F(MadeSystemTest, ExplainSaysThatRulesDoNotReachIt)
+TEST_F(MadeSystemTest, ExplainSaysFirstThatItIsNotCompared)
 {
-    const auto explain = [this](const std::string& element, const std::vector<std::string>& schemas) {
-        std::vector<std::string> arguments{"explain", element, "--spec", Including()};
-        for (const std::string& schema : schemas) {
-            arguments.insert(arguments.end(), {"--schema", schema});
-        }
-        Run(arguments);
-        return Shorten(Shorten(fOut, fThird, "c.xml"), fFirst, "a.xml");
+    const std::string name = "KALMO_OperatingSystem.Name";
+    const std::vector<std::string> rules{"--spec", Including()};
+    for (const std::vector<std::string>& options : {std::vector<std::string>(), rules}) {
+        EXPECT_EQ("KALMO_OperatingSystem: not compared, since cimdelta made the instance of c.xml\n"
+                  "  Name: not compared, since cimdelta made the instance of c.xml\n"
+                  "  OSType: not compared, since cimdelta made the instance of c.xml\n"
+                  "  Version: not compared, since cimdelta made the instance of c.xml\n",
+                  OfRules({"explain", "KALMO_OperatingSystem"}, options, {fThird, fFirst}));
+        EXPECT_EQ(name + ": not compared, since cimdelta made the instance of c.xml\n",
+                  OfRules({"explain", name}, options, {fFirst, fThird}));
+        EXPECT_EQ(name + ": not compared, since cimdelta made the instances of c.xml, d.xml\n",
+                  OfRules({"explain", name}, options, {fThird, fFirst, Scratch("d.xml", ReadFile(fThird))}));
+    }
+}
+
+TEST_F(MadeSystemTest, ExplainNamesTheInventoriesInWhichItIsNotCompared)
+{
+    const std::vector<std::string> rules{"--spec", Including()};
+    const std::string reason = ", by default, R:1 (element for class KALMO_OperatingSystem)\n";
+    EXPECT_EQ("KALMO_OperatingSystem: compared; default include, R:1 (element for class KALMO_OperatingSystem)\n"
+              "  not compared in c.xml, since cimdelta made its instance\n"
+              "  Name: compared" +
+                  reason + "  OSType: compared" + reason + "  Version: compared" + reason,
+              OfRules({"explain", "KALMO_OperatingSystem"}, rules, {fFirst, fSecond, fThird}));
+    EXPECT_EQ(
+        "KALMO_OperatingSystem.Name: compared" + reason + "  not compared in c.xml, d.xml, since cimdelta made their instances\n",
+        OfRules({"explain", "KALMO_OperatingSystem.Name"}, rules, {fFirst, fSecond, fThird, Scratch("d.xml", ReadFile(fThird))}));
+    EXPECT_EQ(std::string::npos, OfRules({"explain", "KALMO_OperatingSystem"}, rules, {fFirst, fSecond}).find("cimdelta made"));
+}
+
+TEST_F(MadeSystemTest, CheckSaysWhatCompareSays)
+{
+    const auto effective = [this](const std::vector<std::string>& schemas) {
+        const std::string listing = OfRules({"check", Including()}, {}, schemas);
+        const std::size_t begin = listing.find("  KALMO_OperatingSystem: ");
+        return listing.substr(begin, listing.find('\n', begin) - begin);
     };
-    EXPECT_NE(std::string::npos, explain("KALMO_OperatingSystem", {fFirst, fSecond, fThird})
-                                     .find("\n  not compared in these inventories, since cimdelta made the instance of c.xml\n"))
-        << fOut;
-    EXPECT_NE(std::string::npos, explain("KALMO_OperatingSystem.Name", {fThird, fFirst})
-                                     .find("\n  not compared at all, since cimdelta made the instance of c.xml\n"))
-        << fOut;
-    EXPECT_EQ(std::string::npos, explain("KALMO_OperatingSystem", {fFirst, fSecond}).find("cimdelta made")) << fOut;
+    EXPECT_EQ("  KALMO_OperatingSystem: not compared, since cimdelta made the instance of c.xml", effective({fThird, fFirst}));
+    EXPECT_EQ("  KALMO_OperatingSystem: not compared, since cimdelta made the instance of c.xml", effective({fFirst, fThird}));
+    EXPECT_EQ("  KALMO_OperatingSystem: not compared, since cimdelta made the instance of c.xml", effective({fThird}));
+    EXPECT_EQ("  KALMO_OperatingSystem: 3 of 3 properties compared; not compared in c.xml, since cimdelta made its instance",
+              effective({fFirst, fSecond, fThird}));
+    EXPECT_EQ("  KALMO_OperatingSystem: 3 of 3 properties compared", effective({fFirst, fSecond}));
 }
 
 TEST_F(MadeSystemTest, OneThatIsMadeForTheReferenceHasTheTypeThatAnotherDeclares)
