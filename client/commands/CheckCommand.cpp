@@ -17,7 +17,7 @@ int RunCheck(const TCheckOptions& options, IConsole& console)
     if (!options.strictSchema && !inventories.empty()) {
         notes = CompleteInventories(inventories, console);
     }
-    DeliverResult(console, options.output, TRulesListing(*rules, inventories, notes).WriteCheck());
+    DeliverResult(console, options.output, TRulesListing(*rules, inventories, notes, options.strictSchema).WriteCheck());
     return kExitSuccess;
 }
 

@@ -41,7 +41,7 @@ int RunCompare(const TCompareOptions& options, IConsole& console)
     std::vector<TInventory> inventories = TInventoryLoader(console).Load(paths);
     const TComparisonReport report = TComparison(inventories, console).Run(rules, options.strictSchema);
     if (!options.allowEmpty && report.coverage.IsNothingCompared()) {
-        throw TClientError(DescribeNothingCompared(report, options.rules));
+        throw TClientError(DescribeNothingCompared(report, options.rules, options.strictSchema));
     }
     DeliverResult(console, options.output, Write(report, options.format, console.IsColored() && IsStandardOutput(options.output)));
     return report.differences.empty() ? kExitSuccess : kExitDifferences;

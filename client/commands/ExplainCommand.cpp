@@ -18,7 +18,8 @@ int RunExplain(const TExplainOptions& options, IConsole& console)
     if (!options.strictSchema) {
         notes = CompleteInventories(inventories, console);
     }
-    TRulesListing listing(rules ? *rules : TRulesText{"", MakeRulesForEverything(inventories, notes), true}, inventories, notes);
+    TRulesListing listing(rules ? *rules : TRulesText{"", MakeRulesForEverything(inventories, notes), true}, inventories, notes,
+                          options.strictSchema);
     const std::size_t dot = options.element.find('.');
     DeliverResult(console, options.output,
                   dot == std::string::npos

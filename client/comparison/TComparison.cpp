@@ -19,6 +19,7 @@
 #include "client/comparison/TDifferenceReader.h"
 #include "client/files/TTemporaryFile.h"
 #include "client/inventory/CompleteInventories.h"
+#include "client/inventory/TSuggestedCommand.h"
 #include "client/inventory/UncomparedSystems.h"
 #include "client/process/LackOfMemory.h"
 #include "client/process/TClientError.h"
@@ -82,7 +83,9 @@ TComparisonReport TComparison::Run(const std::optional<TRulesText>& rules, bool 
     TRules meaning(fInventories[0].ns, text);
     if (!text.isMade) {
         RefuseRecordKeys(fInventories, meaning, text.name);
-        SayRuleWarnings(fConsole, text.name, meaning.GetDocument(), fInventories[0].ns);
+        SayRuleWarnings(
+            fConsole, text.name, meaning.GetDocument(), fInventories[0].ns,
+            TSuggestedCommand("check").AddFile(text.name).AddSchemas(fInventories, strictSchema).Advise("shows all of them"));
     }
     return RunWith(meaning, text);
 }

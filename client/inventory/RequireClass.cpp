@@ -1,5 +1,7 @@
 #include "client/inventory/RequireClass.h"
 
+#include "client/files/TInputFile.h"
+#include "client/inventory/TSuggestedCommand.h"
 #include "client/process/TClientError.h"
 #include "client/text/DisplayText.h"
 
@@ -9,8 +11,8 @@ boost::shared_ptr<TInMemClass> RequireClass(const TInventory& inventory, const s
 {
     const boost::shared_ptr<TInMemClass> cls = inventory.ns->FindClass(name);
     if (!cls) {
-        throw TClientError(inventory.path + ": declares no class " + EscapeForDisplay(name) + "; cimdelta show " + inventory.path +
-                           " lists those it declares");
+        throw TClientError(NameOfInput(inventory.path) + ": declares no class " + EscapeForDisplay(name) +
+                           TSuggestedCommand("show").AddFile(inventory.path).Advise("lists those it declares"));
     }
     return cls;
 }

@@ -4,6 +4,7 @@
 #include <boost/algorithm/string/join.hpp>
 #include <vector>
 
+#include "client/inventory/TSuggestedCommand.h"
 #include "client/text/DisplayText.h"
 #include "client/text/SomeOf.h"
 
@@ -47,24 +48,30 @@ std::vector<std::string> Reasons(const TComparisonReport& report)
     return reasons;
 }
 
-// What shows the reason in full, or removes it.
-std::string Advice(const TComparisonReport& report, const std::string& rulesFile)
+// What shows the reason in full, or removes it; empty or with a semicolon in front.
+std::string Advice(const TComparisonReport& report, const std::string& rulesFile, bool strictSchema)
 {
-    return rulesFile.empty() ? "name inventories with instances"
-                             : "cimdelta check " + rulesFile + " --schema " + report.paths[0] + " shows what the rules compare";
+    if (rulesFile.empty()) {
+        return "; name inventories with instances";
+    }
+    return TSuggestedCommand("check")
+        .AddFile(rulesFile)
+        .AddSchemas(report.paths, strictSchema)
+        .Advise("shows what the rules compare");
 }
 
 }  // namespace
 
-std::string DescribeNothingCompared(const TComparisonReport& report, const std::string& rulesFile)
+std::string DescribeNothingCompared(const TComparisonReport& report, const std::string& rulesFile, bool strictSchema)
 {
     std::vector<std::string> reasons = Reasons(report);
     const bool hasInstances = !reasons.empty();
     if (!hasInstances) {
         reasons.push_back("no inventory has an instance");
     }
-    return EscapeForDisplay("nothing was compared: " + boost::algorithm::join(reasons, "; ") + "; " +
-                            Advice(report, hasInstances ? rulesFile : std::string()) + ", or accept this with --allow-empty");
+    return EscapeForDisplay("nothing was compared: " + boost::algorithm::join(reasons, "; ") +
+                            Advice(report, hasInstances ? rulesFile : std::string(), strictSchema) +
+                            ", or accept this with --allow-empty");
 }
 
 }  // namespace NORVZEL20

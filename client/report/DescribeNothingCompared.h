@@ -7,7 +7,8 @@
 namespace NORVZEL20 {
 
 /// Why a comparison compared nothing, class by class, and what can be done: one message for a person. `rulesFile` is the rules
-/// file as the person named it, or empty. Call this only if report.coverage.IsNothingCompared().
-std::string DescribeNothingCompared(const TComparisonReport& report, const std::string& rulesFile);
+/// file as the person named it, or empty; `strictSchema` is whether the inventories were left as they are. Call this only if
+/// report.coverage.IsNothingCompared().
+std::string DescribeNothingCompared(const TComparisonReport& report, const std::string& rulesFile, bool strictSchema);
 
 }  // namespace NORVZEL20

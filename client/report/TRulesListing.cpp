@@ -18,6 +18,7 @@
 #include "client/files/TInputFile.h"
 #include "client/inventory/CollectObjects.h"
 #include "client/inventory/RequireClass.h"
+#include "client/inventory/TSuggestedCommand.h"
 #include "client/inventory/UncomparedSystems.h"
 #include "client/process/TClientError.h"
 #include "client/rules/DescribeReducedReferences.h"
@@ -66,9 +67,10 @@ boost::shared_ptr<TInMemNamespace> FindSchema(const TRulesText& rules, const std
 }  // namespace
 
 TRulesListing::TRulesListing(const TRulesText& rules, const std::vector<TInventory>& inventories,
-                             const std::vector<TSchemaNote>& notes)
-    : fText(rules), fInventories(inventories), fNotes(notes), fSchema(FindSchema(rules, inventories)), fRules(fSchema, rules),
-      fDocument(fRules.GetDocument()), fTrace(fDocument, fSchema), fWarnings(fDocument, fTrace, fSchema, !inventories.empty())
+                             const std::vector<TSchemaNote>& notes, bool strictSchema)
+    : fText(rules), fInventories(inventories), fNotes(notes), fStrictSchema(strictSchema), fSchema(FindSchema(rules, inventories)),
+      fRules(fSchema, rules), fDocument(fRules.GetDocument()), fTrace(fDocument, fSchema),
+      fWarnings(fDocument, fTrace, fSchema, !inventories.empty())
 {}
 
 std::string TRulesListing::WriteCheck()
@@ -172,7 +174,7 @@ void TRulesListing::WriteWarnings()
 std::string TRulesListing::WriteExplanation(const std::string& className)
 {
     fOut.clear();
-    const boost::shared_ptr<TInMemClass> cls = RequireClass(fInventories.front(), className);
+    const boost::shared_ptr<TInMemClass> cls = RequireDeclared(className);
     const std::vector<std::string> compared = fRules.PropertiesOf(cls);
     if (IsNeverCompared(*cls)) {
         AddLine(cls->GetName() + ": not compared, " + SinceMade());
@@ -196,11 +198,14 @@ std::string TRulesListing::WriteExplanation(const std::string& className)
 std::string TRulesListing::WriteExplanation(const std::string& className, const std::string& property)
 {
     fOut.clear();
-    const boost::shared_ptr<TInMemClass> cls = RequireClass(fInventories.front(), className);
+    const boost::shared_ptr<TInMemClass> cls = RequireDeclared(className);
     const boost::shared_ptr<TInMemPropertyDecl> decl = cls->FindPropertyDecl(property);
     if (!decl) {
-        throw TClientError(fInventories.front().path + ": class " + cls->GetName() + " has no property " +
-                           EscapeForDisplay(property) + "; cimdelta explain " + cls->GetName() + " lists those it has");
+        const std::string place = IsReferenceAlone() ? NameOfInput(fInventories.front().path) + ": " : std::string();
+        throw TClientError(
+            place + "class " + cls->GetName() + " has no property " + EscapeForDisplay(property) +
+            (IsReferenceAlone() ? "" : " in any inventory") +
+            TSuggestedCommand("explain").Add(cls->GetName()).AddSchemas(fInventories, fStrictSchema).Advise("lists those it has"));
     }
     const std::vector<std::string> compared = fRules.PropertiesOf(cls);
     AddLine(cls->GetName() + "." + Verdict(*cls, decl->GetName(), compared));
@@ -208,6 +213,21 @@ std::string TRulesListing::WriteExplanation(const std::string& className, const 
         AddLine("  " + NotComparedWhereMade());
     }
     return fOut;
+}
+
+// Whether what the reference declares is all that counts. Otherwise it declares what any inventory does.
+bool TRulesListing::IsReferenceAlone() const
+{
+    return fStrictSchema || fInventories.size() == 1;
+}
+
+boost::shared_ptr<TInMemClass> TRulesListing::RequireDeclared(const std::string& className) const
+{
+    if (IsReferenceAlone() || fInventories.front().ns->FindClass(className)) {
+        return RequireClass(fInventories.front(), className);
+    }
+    throw TClientError("no inventory declares a class " + EscapeForDisplay(className) +
+                       TSuggestedCommand("show").AddFile(fInventories.front().path).Advise("lists those of the first one"));
 }
 
 void TRulesListing::AddVerdicts(const TInMemClass& cls, const std::vector<std::string>& compared)

@@ -17,9 +17,10 @@ namespace NORVZEL20 {
 class TRulesListing {
   public:
     /// `inventories` are those that the rules are for, the reference first, and `notes` what was done to complete them; both must
-    /// outlive this. Without inventories every class and property that the rules name counts as declared.
-    /// Errors: TClientError for rules that the plug-in does not accept.
-    TRulesListing(const TRulesText& rules, const std::vector<TInventory>& inventories, const std::vector<TSchemaNote>& notes);
+    /// outlive this. With `strictSchema` they were left as they are. Without inventories every class and property that the rules
+    /// name counts as declared. Errors: TClientError for rules that the plug-in does not accept.
+    TRulesListing(const TRulesText& rules, const std::vector<TInventory>& inventories, const std::vector<TSchemaNote>& notes,
+                  bool strictSchema);
     TRulesListing(const TRulesListing&) = delete;
     TRulesListing& operator=(const TRulesListing&) = delete;
 
@@ -49,6 +50,8 @@ class TRulesListing {
     std::vector<std::string> KeysLeftOut(const TInMemClass& cls);
     std::size_t CountInstances(const std::string& className) const;
     std::size_t CountWithSubclasses(const std::string& className) const;
+    boost::shared_ptr<TInMemClass> RequireDeclared(const std::string& className) const;
+    bool IsReferenceAlone() const;
     std::string PathsOfInventories() const;
     std::vector<std::string> PathsOf(const std::vector<std::size_t>& positions) const;
     std::string Verdict(const TInMemClass& cls, const std::string& property, const std::vector<std::string>& compared);
@@ -59,6 +62,7 @@ class TRulesListing {
     const TRulesText fText;
     const std::vector<TInventory>& fInventories;
     const std::vector<TSchemaNote>& fNotes;
+    const bool fStrictSchema;
     const boost::shared_ptr<TInMemNamespace> fSchema;
     TRules fRules;
     const TRulesDocument& fDocument;

@@ -14,7 +14,7 @@ const std::size_t kMostWarnings = 10;
 }  // namespace
 
 void SayRuleWarnings(IConsole& console, const std::string& name, const TRulesDocument& document,
-                     const boost::shared_ptr<ICIMNamespace>& schema)
+                     const boost::shared_ptr<ICIMNamespace>& schema, const std::string& advice)
 {
     const TRuleTrace trace(document, schema);
     const TRuleWarnings warnings(document, trace, schema, true);
@@ -24,8 +24,7 @@ void SayRuleWarnings(IConsole& console, const std::string& name, const TRulesDoc
         console.Say("cimdelta: " + name + ":" + std::to_string(warning.line) + ": warning: " + warning.text);
     }
     if (count > kMostWarnings) {
-        console.Say("cimdelta: " + name + ": " + Counted(count - kMostWarnings, "more warning") +
-                    "; cimdelta check shows all of them");
+        console.Say("cimdelta: " + name + ": " + Counted(count - kMostWarnings, "more warning") + advice);
     }
 }
 

@@ -9,9 +9,10 @@
 
 namespace NORVZEL20 {
 
-/// Says each warning of TRuleWarnings in a line of its own, as `name:line: warning: text`. Of very many, only the first ones and
-/// the number of the others. `schema` is the reference, for which the plug-in accepted `document`. Errors: those of the schema.
+/// Says each warning of TRuleWarnings in a line of its own, as `name:line: warning: text`. Of very many, only the first ones, the
+/// number of the others and `advice`. `schema` is the reference, for which the plug-in accepted `document`. Errors: those of the
+/// schema.
 void SayRuleWarnings(IConsole& console, const std::string& name, const TRulesDocument& document,
-                     const boost::shared_ptr<ICIMNamespace>& schema);
+                     const boost::shared_ptr<ICIMNamespace>& schema, const std::string& advice);
 
 }  // namespace NORVZEL20

@@ -332,7 +332,7 @@ TEST_F(RulesCommandsTest, WhatIsNotDeclaredCannotBeExplained)
 {
     EXPECT_EQ("cimdelta: web01.xml: declares no class Nix; cimdelta show web01.xml lists those it declares\n",
               Complaint({"explain", "Nix", "--spec", "rules.xml", "--schema", "web01.xml"}));
-    EXPECT_EQ("cimdelta: web01.xml: class INV_Disk has no property Nix; cimdelta explain INV_Disk lists those it has\n",
+    EXPECT_EQ("cimdelta: web01.xml: class INV_Disk has no property Nix; cimdelta explain INV_Disk --schema web01.xml lists those it has\n",
               Complaint({"explain", "INV_Disk.Nix", "--spec", "rules.xml", "--schema", "web01.xml"}));
 }
 

@@ -39,7 +39,7 @@ class NothingComparedTest : public TPairFixture {
 TEST_F(NothingComparedTest, TheRulesAreTheReason)
 {
     const std::string advice =
-        "; cimdelta check R --schema a.xml shows what the rules compare, or accept this with --allow-empty\n";
+        "; cimdelta check R --schema a.xml --schema b.xml shows what the rules compare, or accept this with --allow-empty\n";
     const std::string notReached =
         "[2] cimdelta: nothing was compared: no element of the rules is for Disk, KALMO_OperatingSystem, Package or "
         "a class above (letter case counts)";

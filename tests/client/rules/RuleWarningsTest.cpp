@@ -207,7 +207,7 @@ TEST_F(RuleWarningsTest, OfVeryManyOnlyTheFirstAreSaid)
         TRulesParser parser(fSchema);
         parser.Read({"R", Text(std::vector<std::string>(count, "<class name='X' default='include'/>")), false});
         TFakeConsole console;
-        SayRuleWarnings(console, "R", parser.GetDocument(), fSchema);
+        SayRuleWarnings(console, "R", parser.GetDocument(), fSchema, "; see there");
         return console.fErr;
     };
     EXPECT_EQ("", said(2));
@@ -218,8 +218,8 @@ TEST_F(RuleWarningsTest, OfVeryManyOnlyTheFirstAreSaid)
     const std::string ten = said(12);
     EXPECT_EQ(10, std::count(ten.begin(), ten.end(), '\n')) << ten;
     EXPECT_EQ(0u, said(13).find(ten));
-    EXPECT_EQ("cimdelta: R: 1 more warning; cimdelta check shows all of them\n", said(13).substr(ten.size()));
-    EXPECT_EQ("cimdelta: R: 88 more warnings; cimdelta check shows all of them\n", said(100).substr(ten.size()));
+    EXPECT_EQ("cimdelta: R: 1 more warning; see there\n", said(13).substr(ten.size()));
+    EXPECT_EQ("cimdelta: R: 88 more warnings; see there\n", said(100).substr(ten.size()));
 }
 
 }  // namespace

@@ -1,0 +1,74 @@
+#include "client/inventory/TSuggestedCommand.h"
+
+#include <sys/stat.h>
+
+#include <algorithm>
+#include <boost/algorithm/string/replace.hpp>
+
+#include "client/text/DisplayText.h"
+
+namespace NORVZEL20 {
+
+namespace {
+
+// What no shell treats specially, wherever it stands. Bytes above ASCII belong to letters.
+bool IsPlain(char c)
+{
+    const char plain[] = "_-./,:+@%";
+    const bool isLetter = (c >= 'a' && c <= 'z') || (c >= 'A' && c <= 'Z') || static_cast<unsigned char>(c) > 0x7f;
+    return isLetter || (c >= '0' && c <= '9') || std::string(plain).find(c) != std::string::npos;
+}
+
+std::string QuoteForShell(const std::string& word)
+{
+    if (!word.empty() && std::all_of(word.begin(), word.end(), IsPlain)) {
+        return word;
+    }
+    return "'" + boost::algorithm::replace_all_copy(word, "'", "'\\''") + "'";
+}
+
+bool CanBeReadAgain(const std::string& path)
+{
+    struct stat status;
+    // A name that begins with a hyphen would be taken for an option.
+    return path.compare(0, 1, "-") != 0 && stat(path.c_str(), &status) == 0 && S_ISREG(status.st_mode);
+}
+
+}  // namespace
+
+TSuggestedCommand& TSuggestedCommand::Add(const std::string& word)
+{
+    fText += " " + QuoteForShell(word);
+    fCanBeRun = fCanBeRun && EscapeForDisplay(word) == word;
+    return *this;
+}
+
+TSuggestedCommand& TSuggestedCommand::AddFile(const std::string& path)
+{
+    fCanBeRun = fCanBeRun && CanBeReadAgain(path);
+    return Add(path);
+}
+
+TSuggestedCommand& TSuggestedCommand::AddSchemas(const std::vector<std::string>& paths, bool strictSchema)
+{
+    for (const std::string& path : paths) {
+        Add("--schema").AddFile(path);
+    }
+    return strictSchema ? Add("--strict-schema") : *this;
+}
+
+TSuggestedCommand& TSuggestedCommand::AddSchemas(const std::vector<TInventory>& inventories, bool strictSchema)
+{
+    std::vector<std::string> paths;
+    for (const TInventory& inventory : inventories) {
+        paths.push_back(inventory.path);
+    }
+    return AddSchemas(paths, strictSchema);
+}
+
+std::string TSuggestedCommand::Advise(const std::string& purpose) const
+{
+    return fCanBeRun ? "; " + fText + " " + purpose : "";
+}
+
+}  // namespace NORVZEL20
