@@ -19,6 +19,7 @@
 #include "client/comparison/TDifferenceReader.h"
 #include "client/files/TTemporaryFile.h"
 #include "client/inventory/CompleteInventories.h"
+#include "client/inventory/CountInstances.h"
 #include "client/inventory/TSuggestedCommand.h"
 #include "client/inventory/UncomparedSystems.h"
 #include "client/process/LackOfMemory.h"
@@ -99,6 +100,7 @@ TComparisonReport TComparison::RunWith(TRules& rules, const TRulesText& text)
         report.paths.push_back(inventory.path);
     }
     report.coverage = TCoverageBuilder(fInventories, rules, fNotes).Build();
+    report.idleRules = text.isMade ? std::vector<std::string>() : FindIdleRules(rules.GetDocument());
     report.records = MakeDeltaNamespace();
     if (rules.HasExcludedKeys()) {
         KeepForever(report.records);
@@ -108,6 +110,19 @@ TComparisonReport TComparison::RunWith(TRules& rules, const TRulesText& text)
     FindDifferences(*report.records, rules);
     report.differences = TDifferenceReader(fInventories, rules).Read(*report.records);
     return report;
+}
+
+// In the order of the rules, each once.
+std::vector<std::string> TComparison::FindIdleRules(const TRulesDocument& document) const
+{
+    std::vector<std::string> names;
+    for (const TRulesDocument::TElement& element : document.elements) {
+        if (std::find(names.begin(), names.end(), element.className) == names.end() &&
+            CountInstancesOfTree(fInventories, fNotes, element.className) == 0) {
+            names.push_back(element.className);
+        }
+    }
+    return names;
 }
 
 void TComparison::FindDifferences(TDeltaNamespace& records, TRules& rules)

@@ -25,6 +25,7 @@ class TComparison {
 
   private:
     TComparisonReport RunWith(TRules& rules, const TRulesText& text);
+    std::vector<std::string> FindIdleRules(const TRulesDocument& document) const;
     void FindDifferences(TDeltaNamespace& records, TRules& rules);
     void RemoveMadeSystems(TDeltaNamespace& records);
     bool MustKeepReference() const;

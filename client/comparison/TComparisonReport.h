@@ -27,6 +27,7 @@ struct TComparisonReport {
     std::vector<std::string> paths;        ///< of the inventories, in the same order
     std::vector<TDifference> differences;  ///< by class name, then instance, then property
     TCoverage coverage;
+    std::vector<std::string> idleRules;  ///< the classes that a rules file names although no inventory has instances of their trees
     boost::shared_ptr<TDeltaNamespace> records;  ///< the delta namespace of the run
 
     /// Counts the differences. Cost: one pass over them.

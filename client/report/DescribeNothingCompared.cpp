@@ -7,6 +7,8 @@
 #include "client/inventory/TSuggestedCommand.h"
 #include "client/text/DisplayText.h"
 #include "client/text/SomeOf.h"
+#include "embedded/value/TNameText.h"
+#include "provider/DeltaNames.h"
 
 namespace NORVZEL20 {
 
@@ -22,6 +24,14 @@ std::string ClassesIn(TCoverage::EState state, const TCoverage& coverage)
         }
     }
     return SomeOf(names);
+}
+
+// A made operating system may have been seen in other reports on the inventories.
+std::string ExceptMade(const TComparisonReport& report)
+{
+    const bool isMade = std::any_of(report.idleRules.begin(), report.idleRules.end(),
+                                    [](const std::string& name) { return TNameText::Equal(name, kOperatingSystemClass); });
+    return isMade ? " but those that cimdelta made" : "";
 }
 
 std::vector<std::string> Reasons(const TComparisonReport& report)
@@ -45,14 +55,22 @@ std::vector<std::string> Reasons(const TComparisonReport& report)
             reasons.push_back(row.before + classes + row.after);
         }
     }
+    // If there is no instance at all, that alone is the reason.
+    if (!reasons.empty() && !report.idleRules.empty()) {
+        reasons.push_back(SomeOf(report.idleRules) + ", which the rules name, " + (report.idleRules.size() == 1 ? "has" : "have") +
+                          " no instances" + ExceptMade(report));
+    }
     return reasons;
 }
 
 // What shows the reason in full, or removes it; empty or with a semicolon in front.
 std::string Advice(const TComparisonReport& report, const std::string& rulesFile, bool strictSchema)
 {
+    const auto isAny = [&report](TCoverage::EState state) { return !ClassesIn(state, report.coverage).empty(); };
     if (rulesFile.empty()) {
-        return "; name inventories with instances";
+        // Other inventories do not help a class without properties.
+        const bool isOnlyThat = isAny(TCoverage::kNothingToCompare) && !isAny(TCoverage::kOperatingSystemMade);
+        return isOnlyThat ? "" : "; name inventories with instances";
     }
     return TSuggestedCommand("check")
         .AddFile(rulesFile)

@@ -17,6 +17,7 @@
 
 #include "client/files/TInputFile.h"
 #include "client/inventory/CollectObjects.h"
+#include "client/inventory/CountInstances.h"
 #include "client/inventory/RequireClass.h"
 #include "client/inventory/TSuggestedCommand.h"
 #include "client/inventory/UncomparedSystems.h"
@@ -109,7 +110,7 @@ void TRulesListing::WriteEffective()
     AddLine("");
     AddLine("Effective rules (classes with instances in " + PathsOfInventories() + ", or with an element):");
     for (const boost::shared_ptr<TInMemClass>& cls : fSchema->GetClasses()) {
-        if (CountInstances(cls->GetName()) > 0 || HasElement(cls->GetName())) {
+        if (CountOwnInstances(fInventories, fNotes, cls->GetName()) > 0 || HasElement(cls->GetName())) {
             WriteEffective(cls);
         }
     }
@@ -147,7 +148,7 @@ void TRulesListing::WriteUnmatched()
     for (std::size_t index = 0; index < fDocument.elements.size(); ++index) {
         const TRulesDocument::TElement& element = fDocument.elements[index];
         // The rules of an element also reach the classes below its class. One without effect gets a warning instead.
-        if (!fTrace.GetArrival(index).complete && CountWithSubclasses(element.className) == 0) {
+        if (!fTrace.GetArrival(index).complete && CountInstancesOfTree(fInventories, fNotes, element.className) == 0) {
             unmatched += "  " +
                          EscapeForDisplay(fText.name + ":" + std::to_string(element.line) + ": class " + element.className +
                                           " has no instances, nor has any class below it") +
@@ -279,32 +280,6 @@ std::vector<std::string> TRulesListing::KeysLeftOut(const TInMemClass& cls)
         }
     }
     return leftOut;
-}
-
-// In all inventories. An instance that cimdelta made is none.
-std::size_t TRulesListing::CountInstances(const std::string& className) const
-{
-    std::size_t count = 0;
-    for (const TInventory& inventory : fInventories) {
-        const boost::shared_ptr<TInMemClass> cls = inventory.ns->FindClass(className);
-        count += cls ? cls->GetInstanceCount() : 0;
-    }
-    if (TNameText::Equal(className, kOperatingSystemClass)) {
-        count -= static_cast<std::size_t>(std::count_if(
-            fNotes.begin(), fNotes.end(), [](const TSchemaNote& note) { return note.kind == TSchemaNote::kOperatingSystemMade; }));
-    }
-    return count;
-}
-
-std::size_t TRulesListing::CountWithSubclasses(const std::string& className) const
-{
-    // FindClass does not find the root class, which rules may name.
-    const auto cls = boost::dynamic_pointer_cast<TInMemClass>(fSchema->GetClass(className, TCallContext()));
-    std::size_t count = CountInstances(className);
-    for (const boost::shared_ptr<TInMemClass>& below : cls->GetClassesBelow()) {
-        count += CountInstances(below->GetName());
-    }
-    return count;
 }
 
 std::string TRulesListing::PathsOfInventories() const

@@ -48,8 +48,6 @@ class TRulesListing {
     std::string NotComparedWhereMade() const;
     bool HasElement(const std::string& className) const;
     std::vector<std::string> KeysLeftOut(const TInMemClass& cls);
-    std::size_t CountInstances(const std::string& className) const;
-    std::size_t CountWithSubclasses(const std::string& className) const;
     boost::shared_ptr<TInMemClass> RequireDeclared(const std::string& className) const;
     bool IsReferenceAlone() const;
     std::string PathsOfInventories() const;

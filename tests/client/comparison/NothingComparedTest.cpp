@@ -64,6 +64,41 @@ TEST_F(NothingComparedTest, TheRulesAreTheReason)
     }
 }
 
+TEST_F(NothingComparedTest, AClassThatTheRulesNameHasNoInstances)
+{
+    const std::string inventory = Document(Class("Disk", "", KeyProperty("Name")) + Class("Tape", "", KeyProperty("Name")) +
+                                           Class("Reel", "Tape", "") + Instance("Disk", Value("Name", "sda")));
+    const struct {
+        const char* classes;
+        const char* reason;
+    } rows[] = {
+        {"<class name='Tape' default='include'/>", "; Tape, which the rules name, has no instances; "},
+        {"<class name='Tape' default='include'/><class name='Reel' default='include'/><class name='Tape'/>",
+         "; Tape, Reel, which the rules name, have no instances; "},
+        {"<class name='KALMO_OperatingSystem' default='include'/>",
+         "; KALMO_OperatingSystem, which the rules name, has no instances but those that cimdelta made; "},
+        {"<class name='disk' default='include'/>", "(letter case counts); cimdelta check "},
+    };
+    for (const auto& row : rows) {
+        const std::string rules = Scratch("rules", std::string("<DifftoolSpec>") + row.classes + "</DifftoolSpec>");
+        const std::string message = LastMessage(Compare(inventory, inventory, {"--spec", rules}));
+        EXPECT_NE(std::string::npos, message.find(row.reason)) << message;
+        EXPECT_EQ(std::string(row.reason).find("which") == std::string::npos, message.find("which") == std::string::npos)
+            << message;
+    }
+    const std::string below =
+        Document(Class("Tape", "", KeyProperty("Name")) + Class("Reel", "Tape", "") + Instance("Reel", Value("Name", "1")));
+    const std::string rules = Scratch("rules", "<DifftoolSpec><class name='Tape' default='exclude'/></DifftoolSpec>");
+    EXPECT_EQ(std::string::npos, LastMessage(Compare(below, below, {"--spec", rules})).find("which the rules name"));
+}
+
+TEST_F(NothingComparedTest, TheAdviceFitsTheReason)
+{
+    const std::string times = Document(Class("Run", "", Declaration("DateTimeOfCollection", "datetime")) + Instance("Run", ""));
+    EXPECT_EQ("cimdelta: nothing was compared: there is no property to compare in Run, or accept this with --allow-empty\n",
+              LastMessage(Compare(times, times)));
+}
+
 TEST_F(NothingComparedTest, InventoriesWithoutInstancesAreTheReason)
 {
     const std::string message =
