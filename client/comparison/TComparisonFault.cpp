@@ -48,19 +48,19 @@ TCause FindSystemTrouble(const std::vector<TInventory>& inventories)
 {
     for (const TInventory& inventory : inventories) {
         if (!inventory.ns->FindClass(kOperatingSystemClass)) {
-            return {inventory.path + " declares no class " + kOperatingSystemClass, true};
+            return {inventory.path + " declares no class " + kOperatingSystemClass, TFaultSearch::kCompleted};
         }
     }
     const boost::shared_ptr<TInMemClass> systems = inventories[0].ns->FindClass(kOperatingSystemClass);
     if (systems->GetInstanceCount() == 0) {
-        return {inventories[0].path + " has no instance of " + kOperatingSystemClass, true};
+        return {inventories[0].path + " has no instance of " + kOperatingSystemClass, TFaultSearch::kCompleted};
     }
     if (HasUsableType(*systems)) {
-        return {"the inventories are as they should be; perhaps there was not enough memory", false};
+        return {};
     }
     return {"the first " + std::string(kOperatingSystemClass) + " of " + inventories[0].path + " has no " + kOperatingSystemType +
                 " between 0 and 65535" + DescribeUnusableType(*systems),
-            false};
+            ""};
 }
 
 // The cause of kSchemaMismatch (37): the first class, in the order of the walk, that another inventory does not declare although
@@ -73,7 +73,7 @@ TCause FindUndeclaredClass(const std::vector<TInventory>& inventories, TRules& r
             if (inventories[0].ns->FindClass(name)->GetInstanceCount() > 0 && !inventories[i].ns->FindClass(name)) {
                 return {inventories[i].path + " does not declare class " + name + ", of which " + inventories[0].path +
                             " has instances",
-                        true};
+                        TFaultSearch::kCompleted};
             }
         }
     }
@@ -99,9 +99,11 @@ std::string TComparisonFault::Describe(const std::vector<TInventory>& inventorie
         }
         break;
     }
-    return "the comparison failed: " + (log.empty() ? reason : log.back()) + (cause.text.empty() ? "" : "; " + cause.text) +
-           (strictSchema && cause.isSchemaDifferent ? "; without --strict-schema, cimdelta declares and makes what is missing"
-                                                    : "");
+    if (cause.text.empty()) {
+        return "the comparison failed: " + (log.empty() ? reason : log.back());
+    }
+    return "the comparison failed: " + cause.text +
+           (strictSchema && !cause.remedy.empty() ? "; without --strict-schema, " + cause.remedy : "");
 }
 
 }  // namespace NORVZEL20

@@ -20,6 +20,7 @@
 #include "client/inventory/CollectObjects.h"
 #include "client/inventory/PropertyValue.h"
 #include "embedded/store/TInMemInstance.h"
+#include "embedded/value/TNameText.h"
 #include "embedded/value/TValueText.h"
 #include "host/TZELException.h"
 
@@ -87,10 +88,11 @@ TFaultSearch::TCause TFaultSearch::CheckProperties(const TInMemClass& cls, const
         if (!counterpart) {
             return {fInventories[0].path + " does not declare " + Named(property.GetName(), cls) + ", which instance " + key +
                         " of " + fInventories[1].path + " has",
-                    true};
+                    kCompleted};
         }
         if (counterpart->GetType() != property.GetType()) {
-            return {DescribeTypes(cls, *counterpart, fInventories[0], property, fInventories[1]), true};
+            return {DescribeTypes(cls, *counterpart, fInventories[0], property, fInventories[1]),
+                    "instances of both types are compared"};
         }
     }
     return {};
@@ -100,15 +102,16 @@ TFaultSearch::TCause TFaultSearch::CheckNewKeys(const TInMemClass& cls, const TI
 {
     const TInMemClass& there = *added.GetInMemClass();
     const std::string refused = "instance " + key + " of " + fInventories[1].path + " cannot be added to " + fInventories[0].path;
+    const std::string spelled = "names get the spelling of " + fInventories[0].path;
     if (KeysOf(cls) != KeysOf(there)) {
         return {refused + ": the keys of class " + cls.GetName() + " are " + KeysOf(cls) + " in " + fInventories[0].path + " and " +
                     KeysOf(there) + " in " + fInventories[1].path,
-                true};
+                TNameText::Equal(KeysOf(cls), KeysOf(there)) ? spelled : "the instances are reported as different ones"};
     }
     if (cls.GetName() != there.GetName()) {
-        return {refused + ": class " + cls.GetName() + " is spelled " + there.GetName() + " in " + fInventories[1].path, true};
+        return {refused + ": class " + cls.GetName() + " is spelled " + there.GetName() + " in " + fInventories[1].path, spelled};
     }
-    return {refused + ", which has one with the same keys", false};
+    return {refused + ", which has one with the same keys", ""};
 }
 
 TFaultSearch::TCause TFaultSearch::FindRefusedPair() const
@@ -161,7 +164,7 @@ TFaultSearch::TCause TFaultSearch::CheckKeys(const TInventory& inventory, const 
         } catch (const TZELException& error) {
             return {"the keys " + KeysOf(*cls) + " of an instance of class " + className + " of " + inventory.path +
                         " cannot be written as a path: " + error.what(),
-                    false};
+                    ""};
         }
     }
     return {};
@@ -175,10 +178,10 @@ TFaultSearch::TCause TFaultSearch::CheckPair(const ICIMInstance& master, const T
         const boost::shared_ptr<TInMemPropertyDecl> declared = cls.FindPropertyDecl(name);
         const boost::shared_ptr<TInMemPropertyDecl> there = instance.GetInMemClass()->FindPropertyDecl(name);
         if (!there) {
-            return {inventory.path + " does not declare " + Named(name, cls), true};
+            return {inventory.path + " does not declare " + Named(name, cls), kCompleted};
         }
         if (IsRefused(ValueOf(master, name), declared->GetType(), ValueOf(instance, name), fInventories.size())) {
-            return {DescribeTypes(cls, *declared, fInventories[0], *there, inventory), true};
+            return {DescribeTypes(cls, *declared, fInventories[0], *there, inventory), "the values are reported as different"};
         }
     }
     return {};

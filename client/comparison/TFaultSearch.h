@@ -14,8 +14,8 @@ namespace NORVZEL20 {
 class TFaultSearch {
   public:
     struct TCause {
-        std::string text;                ///< file, class and property; empty if nothing was found
-        bool isSchemaDifferent = false;  ///< whether the run would succeed over completed schemas
+        std::string text;    ///< file, class and property; empty if nothing was found
+        std::string remedy;  ///< what would happen over completed schemas; empty if the run would fail there too
     };
 
     /// The arguments must outlive this. The inventories are those of the run, in its order, as the run has left them.
@@ -28,6 +28,9 @@ class TFaultSearch {
     /// The first property of the first pair of instances that the run could not compare, or the first instance whose key it could
     /// not make. Errors: TZELException of a namespace. Cost: that of a run.
     TCause FindRefusedPair() const;
+
+    /// The remedy for what an inventory lacks.
+    static constexpr char kCompleted[] = "cimdelta declares and makes what is missing";
 
   private:
     TCause CheckClass(TInMemClass& cls, const std::vector<std::string>& properties) const;

@@ -300,20 +300,17 @@ TEST_F(CompareTest, IfTypesDifferRecordsStillNameTheOneOtherInventory)
 
 TEST_F(CompareTest, AStrictSchemaIsTakenAsItIs)
 {
-    EXPECT_EQ("cimdelta: the comparison failed: TCIMDiffEngine: Failed to get all properties to check Schema match; "
-              "other-schema.xml declares no "
+    EXPECT_EQ("cimdelta: the comparison failed: other-schema.xml declares no "
               "class KALMO_OperatingSystem; without --strict-schema, cimdelta declares and makes what is missing\n",
               Complaint({"compare", "--strict-schema", "web01.xml", "other-schema.xml"}));
-    EXPECT_EQ(
-        "cimdelta: the comparison failed: Type mismatch; property Size of class INV_Package is uint64 in web01.xml and uint32 in "
-        "other-types.xml; without --strict-schema, cimdelta declares and makes what is missing\n",
-        Complaint({"compare", "--strict-schema", "web01.xml", "other-types.xml"}));
-    EXPECT_EQ(
-        "cimdelta: the comparison failed: TCIMDiffEngine: Schema do not match. (Couldn't find class INV_Service in namespace 2); "
-        "other-types.xml does not declare class INV_Service, of which web01.xml has instances; without --strict-schema, cimdelta "
-        "declares "
-        "and makes what is missing\n",
-        Complaint({"compare", "--strict-schema", "web01.xml", "web02.xml", "other-types.xml"}));
+    EXPECT_EQ("cimdelta: the comparison failed: property Size of class INV_Package is uint64 in web01.xml and uint32 in "
+              "other-types.xml; without --strict-schema, the values are reported as different\n",
+              Complaint({"compare", "--strict-schema", "web01.xml", "other-types.xml"}));
+    EXPECT_EQ("cimdelta: the comparison failed: other-types.xml does not declare class INV_Service, of which web01.xml has "
+              "instances; without --strict-schema, cimdelta "
+              "declares "
+              "and makes what is missing\n",
+              Complaint({"compare", "--strict-schema", "web01.xml", "web02.xml", "other-types.xml"}));
 }
 
 TEST_F(CompareTest, AStrictSchemaThatFitsGivesTheSameReport)
