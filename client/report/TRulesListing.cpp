@@ -138,7 +138,7 @@ void TRulesListing::WriteEffective(const boost::shared_ptr<TInMemClass>& cls)
             (keys.empty() ? "" : "; matched without " + boost::algorithm::join(keys, ", ")) +
             (fTrace.FindReducedReferences(*cls).empty()
                  ? ""
-                 : "; references compared " + DescribeReducedReferences(fRules.ExcludedKeysOf(cls->GetName()))) +
+                 : "; references compared " + DescribeReducedReferences(fTrace.FindKeysOfReferences(cls->GetName()))) +
             (IsPartlyMade(*cls) ? "; " + NotComparedWhereMade() : ""));
 }
 
@@ -307,8 +307,8 @@ std::string TRulesListing::Verdict(const TInMemClass& cls, const std::string& pr
     const std::vector<std::string> reduced = fTrace.FindReducedReferences(cls);
     const bool isReduced = isCompared && std::find(reduced.begin(), reduced.end(), property) != reduced.end();
     return property + ": " + (isCompared ? "compared" : "not compared") + ", " + Reason(cls, property, isCompared) +
-           (isReduced ? "; references " + DescribeReducedReferences(fRules.ExcludedKeysOf(cls.GetName())) + " (excludekeys, " +
-                            fText.name + ":" + std::to_string(fTrace.Find(cls.GetName()).excludedKeysLine) + ")"
+           (isReduced ? "; references " + DescribeReducedReferences(fTrace.FindKeysOfReferences(cls.GetName())) +
+                            " (excludekeys, " + fText.name + ":" + std::to_string(fTrace.Find(cls.GetName()).excludedKeysLine) + ")"
                       : "");
 }
 

@@ -13,8 +13,9 @@ bool IsRecordClass(const std::string& className)
 
 std::string DescribeRecordKeys(const std::string& className)
 {
-    return "keys of class " + className +
-           " cannot be excluded, because the comparison keeps its own records in a class of that name; leave out excludekeys, or "
+    return "rules for class " + className +
+           " cannot have excludekeys, because the comparison keeps its own records in a class of that name; leave out excludekeys, "
+           "or "
            "make both results with -o ndjson and compare those with diff";
 }
 

@@ -10,7 +10,7 @@ namespace NORVZEL20 {
 /// Whether the plug-in keeps its own records in a class of that name, in any letter case.
 bool IsRecordClass(const std::string& className);
 
-/// Why keys of such a class cannot be excluded, and what to do.
+/// Why the rules for such a class cannot have excluded keys, whatever they name, and what to do.
 std::string DescribeRecordKeys(const std::string& className);
 
 }  // namespace NORVZEL20

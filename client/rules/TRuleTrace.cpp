@@ -7,14 +7,40 @@
 
 #include "client/inventory/CollectObjects.h"
 #include "embedded/value/TNameText.h"
+#include "host/TCIMReference.h"
 
 namespace NORVZEL20 {
 
+namespace {
+
+// References may be to classes that no inventory declares.
+void AddKeysInReferences(ICIMClass& cls, std::set<std::string>& keys)
+{
+    for (const boost::shared_ptr<ICIMInstance>& instance : InstancesOf(cls)) {
+        for (const boost::shared_ptr<ICIMProperty>& property : PropertiesOf(*instance)) {
+            const TCIMValue value = property->GetValue(TCallContext());
+            if (!value.IsNull() && value.GetType() == TCIMValue::TCIMType::kReference) {
+                const TCIMReference path = value;
+                path.EnumerateKeyBindings([&keys](const std::pair<std::string, TCIMValue>& binding) {
+                    keys.insert(binding.first);
+                    return true;
+                });
+            }
+        }
+    }
+}
+
+}  // namespace
+
 TRuleTrace::TRuleTrace(const TRulesDocument& document, boost::shared_ptr<ICIMNamespace> schema)
-    : fElements(document.elements), fMarks(document.elements, std::move(schema))
+    : fElements(document.elements), fSchema(std::move(schema)), fMarks(document.elements, fSchema)
 {
     for (std::size_t index = 0; index < fElements.size(); ++index) {
         Merge(index);
+    }
+    for (const boost::shared_ptr<ICIMClass>& cls : AllClassesOf(*fSchema)) {
+        const std::vector<std::string> keys = KeyNamesOf(*cls);
+        fDeclaredKeys.insert(keys.begin(), keys.end());
     }
 }
 
@@ -67,6 +93,22 @@ std::vector<std::string> TRuleTrace::FindReducedReferences(const ICIMClass& cls)
         }
     }
     return names;
+}
+
+std::vector<std::string> TRuleTrace::FindKeysOfReferences(const std::string& className) const
+{
+    const std::vector<std::string> excluded = Find(className).excludedKeys;
+    std::set<std::string> known = fDeclaredKeys;
+    if (std::any_of(excluded.begin(), excluded.end(), [&known](const std::string& key) { return known.count(key) == 0; })) {
+        AddKeysInReferences(*fSchema->GetClass(className, TCallContext()), known);
+    }
+    std::vector<std::string> keys;
+    for (const std::string& key : excluded) {
+        if (known.count(key) != 0 && std::find(keys.begin(), keys.end(), key) == keys.end()) {
+            keys.push_back(key);
+        }
+    }
+    return keys;
 }
 
 void TRuleTrace::Merge(std::size_t index)

@@ -3,6 +3,7 @@
 #include <boost/smart_ptr/shared_ptr.hpp>
 #include <map>
 #include <optional>
+#include <set>
 #include <string>
 #include <vector>
 
@@ -51,6 +52,11 @@ class TRuleTrace {
     /// a class out of all references that its instances hold, whatever class they refer to, and the namespace too.
     std::vector<std::string> FindReducedReferences(const ICIMClass& cls) const;
 
+    /// The excluded keys of the class that references can lose, in the order of the rules: the keys of declared classes, and those
+    /// that occur in references of the class's instances in the schema. A name that is neither changes no reference.
+    /// Cost: one pass over those instances if an excluded key is not a key of any declared class.
+    std::vector<std::string> FindKeysOfReferences(const std::string& className) const;
+
     /// How the element at that position found its class.
     const TArrival& GetArrival(std::size_t index) const { return fArrivals[index]; }
 
@@ -64,7 +70,9 @@ class TRuleTrace {
     TDecision MakeListed(std::size_t index, const std::string& property) const;
 
     const std::vector<TRulesDocument::TElement>& fElements;
+    boost::shared_ptr<ICIMNamespace> fSchema;
     TRuleMarks fMarks;
+    std::set<std::string> fDeclaredKeys;             // of all classes
     std::vector<TArrival> fArrivals;                 // one for each element
     std::map<std::string, std::size_t> fCompleting;  // the element that completed the rules of each class
 };

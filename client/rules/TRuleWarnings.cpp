@@ -196,16 +196,22 @@ void TRuleWarnings::CheckDefault(std::size_t index)
 void TRuleWarnings::CheckReferences()
 {
     std::map<std::size_t, std::vector<std::string>> references;
+    std::map<std::size_t, std::set<std::string>> keys;
     for (const boost::shared_ptr<ICIMClass>& cls : AllClassesOf(*fSchema)) {
         const std::string& className = cls->GetName(TCallContext());
         for (const std::string& property : fTrace.FindReducedReferences(*cls)) {
             references[*fMarks.FindKeys(className)].push_back(className + "." + property);
+            const std::vector<std::string> lost = fTrace.FindKeysOfReferences(className);
+            keys[*fMarks.FindKeys(className)].insert(lost.begin(), lost.end());
         }
     }
     for (const auto& [index, properties] : references) {
+        std::vector<std::string> lost;
+        std::copy_if(fElements[index].excludedKeys.begin(), fElements[index].excludedKeys.end(), std::back_inserter(lost),
+                     [&found = keys[index]](const std::string& key) { return found.erase(key) != 0; });
         Warn(index, fElements[index].line,
              "excludekeys also applies to references: those in " + SomeOf(properties) + " are compared " +
-                 DescribeReducedReferences(fElements[index].excludedKeys));
+                 DescribeReducedReferences(lost));
     }
 }
 

@@ -18,8 +18,9 @@ class RecordKeysTest : public TClientFixture {
 
     static std::string Refusal(const std::string& cls)
     {
-        return "cimdelta: R:2: keys of class " + cls +
-               " cannot be excluded, because the comparison keeps its own records in a class of that name; leave out excludekeys, "
+        return "cimdelta: R:2: rules for class " + cls +
+               " cannot have excludekeys, because the comparison keeps its own records in a class of that name; leave out "
+               "excludekeys, "
                "or make both results with -o ndjson and compare those with diff\n";
     }
 };

@@ -38,6 +38,33 @@ TEST_F(ReducedReferencesTest, CheckWarnsOfThem)
         Warnings("<class name='&lt;root&gt;' default='include' excludekeys='Point Name'/>"));
 }
 
+/// As a comparison says it, which finds no such key in any reference.
+TEST_F(ReducedReferencesTest, AKeyThatNoReferenceCanHaveIsNotNamed)
+{
+    const std::string rules = "<class name='Mount' default='include' excludekeys='Foo'/>";
+    EXPECT_EQ("Mount.Dev: compared, by default, R:1 (element for class Mount); references without their namespace (excludekeys, "
+              "R:1)\n",
+              Ask("explain", "Mount.Dev", rules));
+    const std::string listing = Ask("check", "", rules);
+    EXPECT_NE(std::string::npos, listing.find("  Mount: 2 of 2 properties compared; references compared without their namespace\n"))
+        << listing;
+    EXPECT_NE(std::string::npos, listing.find("those in Mount.Dev, NetworkMount.Dev, NetworkMount.Server are compared without "
+                                              "their namespace\n"))
+        << listing;
+}
+
+TEST_F(ReducedReferencesTest, AKeyOfAnUndeclaredClassIsNamedIfAReferenceHasIt)
+{
+    const std::string rules =
+        Scratch("rules", "<DifftoolSpec><class name='Mount' default='include' excludekeys='Foo Foo Bar'/></DifftoolSpec>");
+    const std::string a = Scratch("a.xml", MountOf(Path("Nowhere", "Foo", "1")));
+    const std::string words = "compared without key Foo and without their namespace";
+    EXPECT_NE(std::string::npos, Result({"check", rules, "--schema", a}).find("; references " + words + "\n")) << fOut;
+    EXPECT_NE(std::string::npos, fOut.find("NetworkMount.Server are " + words + "\n")) << fOut;
+    Run({"compare", "--spec", rules, a, Scratch("b.xml", MountOf(Path("Nowhere", "Foo", "2")))});
+    EXPECT_NE(std::string::npos, fOut.find("References of Mount were " + words + ".\n")) << fOut;
+}
+
 TEST_F(ReducedReferencesTest, CheckIsSilentIfNoReferenceIsCompared)
 {
     EXPECT_EQ("", Warnings("<class name='Mount' default='include'/>"));

@@ -175,10 +175,10 @@ TEST_F(RuleWarningsTest, KeysOfTheComparisonsOwnRecordsAreNamed)
 {
     TNamespaceBuilder(fSchema).Class("KALMO_Delta", "", {TNamespaceBuilder::Key("DeltaID")});
     EXPECT_EQ("", Warnings({"<class name='KALMO_Delta' default='include'/>"}));
-    EXPECT_EQ(
-        "1 keys of class KALMO_Delta cannot be excluded, because the comparison keeps its own records in a class of that name; "
-        "leave out excludekeys, or make both results with -o ndjson and compare those with diff\n",
-        Warnings({"<class name='KALMO_Delta' default='include' excludekeys='DeltaID'/>"}));
+    EXPECT_EQ("1 rules for class KALMO_Delta cannot have excludekeys, because the comparison keeps its own records in a class of "
+              "that name; "
+              "leave out excludekeys, or make both results with -o ndjson and compare those with diff\n",
+              Warnings({"<class name='KALMO_Delta' default='include' excludekeys='DeltaID'/>"}));
 }
 
 TEST_F(RuleWarningsTest, WithoutASchemaOnlyWhatHoldsForEverySchemaIsSaid)
