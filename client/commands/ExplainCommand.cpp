@@ -3,6 +3,7 @@
 #include "client/inventory/CompleteInventories.h"
 #include "client/inventory/TInventoryLoader.h"
 #include "client/process/ExitStatus.h"
+#include "client/process/TClientError.h"
 #include "client/report/ResultOutput.h"
 #include "client/report/TRulesListing.h"
 #include "client/rules/MadeRules.h"
@@ -10,8 +11,31 @@
 
 namespace NORVZEL20 {
 
+namespace {
+
+// The parts of CLASS or CLASS.PROPERTY.
+struct TAskedElement {
+    std::string className;
+    std::optional<std::string> property;
+};
+
+TAskedElement Split(const std::string& text)
+{
+    const std::size_t dot = text.find('.');
+    if (dot == std::string::npos) {
+        return {text, std::nullopt};
+    }
+    if (dot == 0 || dot + 1 == text.size()) {
+        throw TClientError(text + " is neither CLASS nor CLASS.PROPERTY");
+    }
+    return {text.substr(0, dot), text.substr(dot + 1)};
+}
+
+}  // namespace
+
 int RunExplain(const TExplainOptions& options, IConsole& console)
 {
+    const TAskedElement element = Split(options.element);
     const std::optional<TRulesText> rules = ReadRulesFor(options.schemas, options.rules);
     std::vector<TInventory> inventories = TInventoryLoader(console).Load(options.schemas);
     std::vector<TSchemaNote> notes;
@@ -20,11 +44,9 @@ int RunExplain(const TExplainOptions& options, IConsole& console)
     }
     TRulesListing listing(rules ? *rules : TRulesText{"", MakeRulesForEverything(inventories, notes), true}, inventories, notes,
                           options.strictSchema);
-    const std::size_t dot = options.element.find('.');
     DeliverResult(console, options.output,
-                  dot == std::string::npos
-                      ? listing.WriteExplanation(options.element)
-                      : listing.WriteExplanation(options.element.substr(0, dot), options.element.substr(dot + 1)));
+                  element.property ? listing.WriteExplanation(element.className, *element.property)
+                                   : listing.WriteExplanation(element.className));
     return kExitSuccess;
 }
 

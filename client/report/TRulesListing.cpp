@@ -28,6 +28,7 @@
 #include "client/text/DisplayText.h"
 #include "client/text/SomeOf.h"
 #include "embedded/value/TNameText.h"
+#include "host/RootClassName.h"
 #include "provider/DeltaNames.h"
 
 namespace NORVZEL20 {
@@ -175,6 +176,9 @@ void TRulesListing::WriteWarnings()
 std::string TRulesListing::WriteExplanation(const std::string& className)
 {
     fOut.clear();
+    if (className == kRootClassName) {
+        return WriteRootExplanation();
+    }
     const boost::shared_ptr<TInMemClass> cls = RequireDeclared(className);
     const std::vector<std::string> compared = fRules.PropertiesOf(cls);
     if (IsNeverCompared(*cls)) {
@@ -199,6 +203,9 @@ std::string TRulesListing::WriteExplanation(const std::string& className)
 std::string TRulesListing::WriteExplanation(const std::string& className, const std::string& property)
 {
     fOut.clear();
+    if (className == kRootClassName) {
+        throw TClientError("class " + className + " has no properties");
+    }
     const boost::shared_ptr<TInMemClass> cls = RequireDeclared(className);
     const boost::shared_ptr<TInMemPropertyDecl> decl = cls->FindPropertyDecl(property);
     if (!decl) {
@@ -212,6 +219,24 @@ std::string TRulesListing::WriteExplanation(const std::string& className, const 
     AddLine(cls->GetName() + "." + Verdict(*cls, decl->GetName(), compared));
     if (Contains(compared, decl->GetName()) && IsPartlyMade(*cls)) {
         AddLine("  " + NotComparedWhereMade());
+    }
+    return fOut;
+}
+
+// Rules name the root class for the sake of the classes below it.
+std::string TRulesListing::WriteRootExplanation()
+{
+    const std::string name = kRootClassName;
+    const std::string fact = name + ": has no properties and no instances";
+    if (!HasElement(name)) {
+        AddLine(fact + (fText.isMade ? "" : "; no element is for it"));
+        return fOut;
+    }
+    const TRuleTrace::TClass rules = fTrace.Find(name);
+    AddLine(fact + "; for the classes below: default " + Verb(rules.byDefault.treatment) + ", " + Origin(rules.byDefault));
+    if (!rules.excludedKeys.empty()) {
+        AddLine("  matched without " + boost::algorithm::join(rules.excludedKeys, ", ") + " (excludekeys, " + fText.name + ":" +
+                std::to_string(rules.excludedKeysLine) + ")");
     }
     return fOut;
 }

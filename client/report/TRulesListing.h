@@ -28,8 +28,8 @@ class TRulesListing {
     /// classes have no instances, and warnings. Without inventories, the elements and those warnings that need none.
     std::string WriteCheck();
 
-    /// How a class is treated, property by property. There must be an inventory.
-    /// Errors: TClientError if the reference does not declare the class.
+    /// How a class is treated, property by property; of the root class, which has none, what the rules say of it. There must be an
+    /// inventory. Errors: TClientError if the reference does not declare the class.
     std::string WriteExplanation(const std::string& className);
     /// How one property is treated. There must be an inventory.
     /// Errors: TClientError if the reference does not declare the class or the property.
@@ -41,6 +41,7 @@ class TRulesListing {
     void WriteEffective(const boost::shared_ptr<TInMemClass>& cls);
     void WriteUnmatched();
     void WriteWarnings();
+    std::string WriteRootExplanation();
     void AddVerdicts(const TInMemClass& cls, const std::vector<std::string>& compared);
     bool IsNeverCompared(const TInMemClass& cls) const;
     bool IsPartlyMade(const TInMemClass& cls) const;

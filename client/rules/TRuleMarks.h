@@ -25,7 +25,7 @@ class TRuleMarks {
     /// order of the file. Errors: those of the schema. Cost: that of the plug-in's merge, times the number of digits of a position.
     void Merge(std::size_t element);
 
-    /// Whether the class's rules are complete: no later element changes them.
+    /// Whether the class's rules are final: no later element changes them.
     bool IsFinal(const std::string& className) const;
 
     /// The element whose default the class has; none if no element has reached it.

@@ -36,7 +36,7 @@ class TRuleTrace {
     /// What an element found when it was merged.
     struct TArrival {
         std::optional<std::size_t> keys;      ///< the element that had already given the class its excluded keys
-        std::optional<std::size_t> complete;  ///< the element that had already completed the class's rules
+        std::optional<std::size_t> complete;  ///< the element after which the class's rules were final
     };
 
     /// `document` is what the plug-in accepted for `schema`; it must outlive this. Errors: those of the schema.
@@ -74,7 +74,7 @@ class TRuleTrace {
     TRuleMarks fMarks;
     std::set<std::string> fDeclaredKeys;             // of all classes
     std::vector<TArrival> fArrivals;                 // one for each element
-    std::map<std::string, std::size_t> fCompleting;  // the element that completed the rules of each class
+    std::map<std::string, std::size_t> fCompleting;  // the element after which the rules of each class are final
 };
 
 }  // namespace NORVZEL20

@@ -1,9 +1,10 @@
 // Each element is judged once, by what became of it when all were merged (TRuleTrace):
 //
-//     the class's rules were complete before it             it has no effect; nothing else is said about it
+//     the class's rules were final before it                it has no effect; nothing else is said about it
 //     the class had rules before it                         its excluded keys have no effect
 //     a class above decides the default in the end          the element came too early
 //     it decides the default, but names none                the class is left out, perhaps without intent
+//     it lists the time of collection, default include      the listing has no effect
 //
 // What is odd in an element by itself (letter case, repeated names, keys that are none) needs only the schema.
 //
@@ -24,6 +25,7 @@
 #include "client/rules/ShowText.h"
 #include "client/text/SomeOf.h"
 #include "embedded/value/TNameText.h"
+#include "provider/DeltaNames.h"
 
 namespace NORVZEL20 {
 
@@ -45,6 +47,7 @@ TRuleWarnings::TRuleWarnings(const TRulesDocument& document, const TRuleTrace& t
     : fElements(document.elements), fTrace(trace), fMarks(trace.GetMarks()), fSchema(std::move(schema)),
       fIsSchemaKnown(isSchemaKnown)
 {
+    CheckThatAnythingIsIncluded();
     for (std::size_t index = 0; index < fElements.size(); ++index) {
         Check(index);
     }
@@ -62,8 +65,8 @@ void TRuleWarnings::Check(std::size_t index)
     const TRulesDocument::TElement& element = fElements[index];
     if (const std::optional<std::size_t> complete = fTrace.GetArrival(index).complete) {
         Warn(index, element.line,
-             "this element for class " + ShowName(element.className) + " has no effect: the element at " + LineOf(*complete) +
-                 " completed the rules of the class; put what is meant into that one");
+             "this element for class " + ShowName(element.className) + " has no effect: the rules of the class were final after " +
+                 LineOf(*complete) + "; put what is meant there");
         return;
     }
     CheckRepetition(index);
@@ -76,6 +79,7 @@ void TRuleWarnings::Check(std::size_t index)
         CheckKeys(index, cls);
         CheckOverruled(index);
         CheckDefault(index);
+        CheckCollectionTime(index);
     }
 }
 
@@ -190,6 +194,36 @@ void TRuleWarnings::CheckDefault(std::size_t index)
          "class " + ShowName(element.className) +
              " is not compared: this element has no default, which means exclude, and no list includes a "
              "property; write default=\"include\" or default=\"exclude\"");
+}
+
+// An included time of collection has an effect only if the default is to exclude.
+void TRuleWarnings::CheckCollectionTime(std::size_t index)
+{
+    const std::string& className = fElements[index].className;
+    const std::map<std::string, std::size_t> listers = fMarks.FindListed(className);
+    const auto lister = listers.find(kCollectionTime);
+    const TRuleTrace::TClass rules = fTrace.Find(className);
+    if (lister == listers.end() || lister->second != index || rules.byDefault.treatment != TCIMDiffEngine::INCLUDE ||
+        rules.listed.at(kCollectionTime).treatment != TCIMDiffEngine::INCLUDE) {
+        return;
+    }
+    Warn(index, rules.listed.at(kCollectionTime).line,
+         "property " + std::string(kCollectionTime) + " of class " + ShowName(className) +
+             " is never compared if the default is include, so this listing has no effect; write default=\"exclude\" and list "
+             "all that is to be compared");
+}
+
+void TRuleWarnings::CheckThatAnythingIsIncluded()
+{
+    const bool includesAny = std::any_of(fElements.begin(), fElements.end(), [](const TRulesDocument::TElement& element) {
+        return element.defaultTreatment == TCIMDiffEngine::INCLUDE ||
+               std::any_of(element.listed.begin(), element.listed.end(),
+                           [](const auto& listed) { return listed.treatment == TCIMDiffEngine::INCLUDE; });
+    });
+    if (!includesAny) {
+        Warn(0, fElements.empty() ? 1 : fElements.front().line,
+             "these rules compare nothing, because no element includes anything; write default=\"include\" or an includelist");
+    }
 }
 
 // One warning for each element: its keys may reach many classes below its class.

@@ -16,7 +16,7 @@ class TRuleWarnings {
   public:
     /// One warning.
     struct TWarning {
-        std::size_t element;  ///< the position of the element that it is about
+        std::size_t element;  ///< the position of the element that it is about; 0 if it is about the whole file
         unsigned int line;
         std::string text;
     };
@@ -37,6 +37,8 @@ class TRuleWarnings {
     void WarnOfLateKeys(std::size_t index, std::size_t earlier);
     void CheckOverruled(std::size_t index);
     void CheckDefault(std::size_t index);
+    void CheckCollectionTime(std::size_t index);
+    void CheckThatAnythingIsIncluded();
     void CheckReferences();
     void CheckRecordClasses();
     void Warn(std::size_t index, unsigned int line, const std::string& text);

@@ -42,8 +42,8 @@ TEST_F(RulesCommandsTest, CheckWarnsOfWhatAnAuthorHardlyMeans)
         "  odd-rules.xml:17: property Version of class INV_Package is already listed in this element; the first listing counts\n"
         "  odd-rules.xml:20: excludekeys of class INV_Package has no effect: the class has the keys of its first element, at line "
         "11; name them there\n"
-        "  odd-rules.xml:21: this element for class INV_Package has no effect: the element at line 20 completed the rules of the "
-        "class; put what is meant into that one\n",
+        "  odd-rules.xml:21: this element for class INV_Package has no effect: the rules of the class were final after line 20; "
+        "put what is meant there\n",
         listing.substr(listing.find("Warnings:")));
     EXPECT_EQ(0, fStatus);
 }
@@ -225,15 +225,14 @@ TEST_F(RulesCommandsTest, AnElementWithoutEffectIsOnlyWarnedOf)
     const std::string element = "<class name='INV_Package' default='include'/>\n";
     const std::string rules = Scratch("late", "<DifftoolSpec>\n" + element + element + element + "</DifftoolSpec>");
     const std::string listing = Shorten(Result({"check", rules, "--schema", "empty-classes.xml"}), rules, "R");
-    EXPECT_EQ(
-        "Rules that matched nothing:\n"
-        "  R:2: class INV_Package has no instances, nor has any class below it\n"
-        "  R:3: class INV_Package has no instances, nor has any class below it\n"
-        "\n"
-        "Warnings:\n"
-        "  R:4: this element for class INV_Package has no effect: the element at line 3 completed the rules of the class; put what "
-        "is meant into that one\n",
-        listing.substr(std::min(listing.size(), listing.find("Rules that matched nothing"))));
+    EXPECT_EQ("Rules that matched nothing:\n"
+              "  R:2: class INV_Package has no instances, nor has any class below it\n"
+              "  R:3: class INV_Package has no instances, nor has any class below it\n"
+              "\n"
+              "Warnings:\n"
+              "  R:4: this element for class INV_Package has no effect: the rules of the class were final after line 3; put what "
+              "is meant there\n",
+              listing.substr(std::min(listing.size(), listing.find("Rules that matched nothing"))));
 }
 
 TEST_F(RulesCommandsTest, WithoutRulesExplainShowsThatEverythingIsCompared)
@@ -328,11 +327,39 @@ TEST_F(RulesCommandsTest, CompareSaysTheWarningsOfCheck)
     EXPECT_EQ("", fErr);
 }
 
+/// Before the inventory is loaded: this one cannot be.
+TEST_F(RulesCommandsTest, WhatIsNoElementCannotBeExplained)
+{
+    const std::string damaged = Scratch("damaged.xml", "<CIM><");
+    for (const std::string element : {"INV_Disk.", ".Size", "."}) {
+        EXPECT_EQ("cimdelta: " + element + " is neither CLASS nor CLASS.PROPERTY\n",
+                  Complaint({"explain", element, "--schema", damaged}));
+    }
+}
+
+TEST_F(RulesCommandsTest, TheRootClassIsExplainedByItsElement)
+{
+    const auto explain = [this](const std::string& classes) {
+        const std::string rules = Scratch("root", "<DifftoolSpec>" + classes + "</DifftoolSpec>");
+        return Shorten(Result({"explain", "<root>", "--spec", rules, "--schema", "web01.xml"}), rules, "R");
+    };
+    EXPECT_EQ("<root>: has no properties and no instances; for the classes below: default include, R:1 (element for class <root>)\n"
+              "  matched without BootId (excludekeys, R:1)\n",
+              explain("<class name='&lt;root&gt;' default='include' excludekeys='BootId'/>"));
+    EXPECT_EQ(
+        "<root>: has no properties and no instances; for the classes below: default exclude, R:1 (element for class <root>)\n",
+        explain("<class name='&lt;root&gt;'/>"));
+    EXPECT_EQ("<root>: has no properties and no instances; no element is for it\n", explain("<class name='INV_Disk'/>"));
+    EXPECT_EQ("<root>: has no properties and no instances\n", Result({"explain", "<root>", "--schema", "web01.xml"}));
+    EXPECT_EQ("cimdelta: class <root> has no properties\n", Complaint({"explain", "<root>.Name", "--schema", "web01.xml"}));
+}
+
 TEST_F(RulesCommandsTest, WhatIsNotDeclaredCannotBeExplained)
 {
     EXPECT_EQ("cimdelta: web01.xml: declares no class Nix; cimdelta show web01.xml lists those it declares\n",
               Complaint({"explain", "Nix", "--spec", "rules.xml", "--schema", "web01.xml"}));
-    EXPECT_EQ("cimdelta: web01.xml: class INV_Disk has no property Nix; cimdelta explain INV_Disk --schema web01.xml lists those it has\n",
+    EXPECT_EQ("cimdelta: web01.xml: class INV_Disk has no property Nix; cimdelta explain INV_Disk --schema web01.xml lists those "
+              "it has\n",
               Complaint({"explain", "INV_Disk.Nix", "--spec", "rules.xml", "--schema", "web01.xml"}));
 }
 

@@ -79,7 +79,6 @@ const char kOverruled[] =
 TEST_F(RuleWarningsTest, OrdinaryRulesGetNone)
 {
     const std::vector<std::string> rows[] = {
-        {},
         {"<class name='A' default='include'/>", "<class name='B' default='exclude'/>", "<class name='D' default='include'/>"},
         {"<class name='C' default='exclude'/>", "<class name='C' default='include'/>"},
         {"<class name='A'><includelist><value>p</value></includelist></class>"},
@@ -137,12 +136,10 @@ TEST_F(RuleWarningsTest, EachIsGivenForItsCause)
         // The ancestor came later, but then the class again.
         {{"<class name='D' default='include'/>", "<class name='A' default='exclude'/>", "<class name='D' default='include'/>"}, ""},
         {{"<class name='C' default='include'/>", "<class name='C' default='include'/>", "<class name='C' default='include'/>"},
-         "3 this element for class C has no effect: the element at line 2 completed the rules of the class; put what is meant into "
-         "that one\n"},
+         "3 this element for class C has no effect: the rules of the class were final after line 2; put what is meant there\n"},
         {{"<class name='A' default='include'/>", "<class name='B' default='include'/>",
           "<class name='B' excludekeys='nix'><includelist><value>p</value><value>p</value></includelist></class>"},
-         "3 this element for class B has no effect: the element at line 2 completed the rules of the class; put what is meant into "
-         "that one\n"},
+         "3 this element for class B has no effect: the rules of the class were final after line 2; put what is meant there\n"},
         {{"<class name='C' default='include'/>", "<class name='C' default='include' excludekeys='K'/>"},
          "2 excludekeys of class C has no effect: the class has the keys of its first element, at line 1; name them there\n"},
         {{"<class name='A' default='include' excludekeys='p'/>"}, "1 excluded key p is not a key of class A\n"},
@@ -157,7 +154,7 @@ TEST_F(RuleWarningsTest, EachIsGivenForItsCause)
           "</excludelist></class>"},
          "1 property q of class A is already listed in this element; the first listing counts\n"
          "1 property P of class A is declared as p; letter case counts in rules\n"},
-        {{"<class name='A'/>"},
+        {{"<class name='A'/>", "<class name='X' default='include'/>"},
          "1 class A is not compared: this element has no default, which means exclude, and no list includes a property; write "
          "default=\"include\" or default=\"exclude\"\n"},
         {{"<class name='A'><excludelist><value>p</value></excludelist><includelist><value>p</value></includelist></class>"},
@@ -168,6 +165,47 @@ TEST_F(RuleWarningsTest, EachIsGivenForItsCause)
     for (const auto& row : rows) {
         EXPECT_EQ(row.warnings, Warnings(row.elements)) << Text(row.elements);
     }
+}
+
+TEST_F(RuleWarningsTest, ATimeOfCollectionThatIsListedInVainIsNamed)
+{
+    TNamespaceBuilder(fSchema)
+        .Class("T", "", {TNamespaceBuilder::Key("K"), TNamespaceBuilder::Property("DateTimeOfCollection")})
+        .Class("U", "T", {});
+    const std::string list = "<includelist><value>DateTimeOfCollection</value></includelist></class>";
+    const std::string warning =
+        " property DateTimeOfCollection of class T is never compared if the default is include, so this listing has no effect; "
+        "write default=\"exclude\" and list all that is to be compared\n";
+    const struct {
+        std::vector<std::string> elements;
+        std::string warnings;
+    } rows[] = {
+        {{"<class name='T' default='include'>" + list}, "1" + warning},
+        {{"<class name='T' default='include'>\n" + list}, "2" + warning},
+        {{"<class name='T' default='exclude'>" + list}, ""},
+        {{"<class name='T'>" + list}, ""},
+        {{"<class name='T' default='include'><excludelist><value>DateTimeOfCollection</value></excludelist></class>"}, ""},
+        // The later element decides the default.
+        {{"<class name='T' default='exclude'>" + list, "<class name='T' default='include'/>"}, "1" + warning},
+        {{"<class name='T' default='include'>" + list, "<class name='T' default='exclude'/>"}, ""},
+    };
+    for (const auto& row : rows) {
+        EXPECT_EQ(row.warnings, Warnings(row.elements)) << Text(row.elements);
+    }
+}
+
+TEST_F(RuleWarningsTest, RulesThatIncludeNothingAreNamed)
+{
+    const std::string warning =
+        "1 these rules compare nothing, because no element includes anything; write default=\"include\" or an includelist\n";
+    const std::string excluded = "<excludelist><value>K</value></excludelist></class>";
+    for (const std::vector<std::string>& elements :
+         {std::vector<std::string>(), {"<class name='A' default='exclude'/>"}, {"<class name='A' default='exclude'>" + excluded}}) {
+        EXPECT_EQ(warning, Warnings(elements)) << Text(elements);
+        EXPECT_EQ(warning, WarningsWithoutSchema(elements)) << Text(elements);
+    }
+    EXPECT_EQ("", Warnings({"<class name='A' default='exclude'/>", "<class name='X' default='include'/>"}));
+    EXPECT_EQ("", Warnings({"<class name='A' default='exclude'><includelist><value>p</value></includelist></class>"}));
 }
 
 /// Such a comparison would fail, so it is refused; check says it before.
@@ -188,8 +226,7 @@ TEST_F(RuleWarningsTest, WithoutASchemaOnlyWhatHoldsForEverySchemaIsSaid)
                                      "<class name='a' excludekeys='K'/>", "<class name='N'/>"}));
     EXPECT_EQ("1 property p of class N is already listed in this element; the first listing counts\n"
               "2 excludekeys of class N has no effect: the class has the keys of its first element, at line 1; name them there\n"
-              "3 this element for class N has no effect: the element at line 2 completed the rules of the class; put what is meant "
-              "into that one\n",
+              "3 this element for class N has no effect: the rules of the class were final after line 2; put what is meant there\n",
               WarningsWithoutSchema({"<class name='N'><includelist><value>p</value><value>p</value></includelist></class>",
                                      "<class name='N' excludekeys='k'/>", "<class name='N'/>"}));
 }
@@ -211,10 +248,9 @@ TEST_F(RuleWarningsTest, OfVeryManyOnlyTheFirstAreSaid)
         return console.fErr;
     };
     EXPECT_EQ("", said(2));
-    EXPECT_EQ(
-        "cimdelta: R:3: warning: this element for class X has no effect: the element at line 2 completed the rules of the class; "
-        "put what is meant into that one\n",
-        said(3));
+    EXPECT_EQ("cimdelta: R:3: warning: this element for class X has no effect: the rules of the class were final after line 2; put "
+              "what is meant there\n",
+              said(3));
     const std::string ten = said(12);
     EXPECT_EQ(10, std::count(ten.begin(), ten.end(), '\n')) << ten;
     EXPECT_EQ(0u, said(13).find(ten));
