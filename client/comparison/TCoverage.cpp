@@ -21,8 +21,9 @@ bool IsWhole(const TCoverage::TClass& cls, bool timesCount)
         return !cls.HasOwnInstances();
     }
     return cls.state == TCoverage::kCompared && !HasAny(cls.sharing) && !cls.reducedReferences &&
-           std::all_of(cls.leftOut.begin(), cls.leftOut.end(),
-                       [timesCount](const std::string& name) { return !timesCount && name == kCollectionTime; });
+           std::all_of(cls.leftOut.begin(), cls.leftOut.end(), [timesCount](const TCoverage::TLeftOut& leftOut) {
+               return !timesCount && leftOut.property == kCollectionTime;
+           });
 }
 
 }  // namespace

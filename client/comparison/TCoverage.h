@@ -19,6 +19,20 @@ struct TCoverage {
         kOperatingSystemMade,  ///< the client made so many instances of KALMO_OperatingSystem that no real ones meet
     };
 
+    /// Why a property of a compared class is not compared.
+    enum EReason {
+        kUsedAsKey,         ///< it identifies instances, and the rules do not have it compared as a property
+        kNotDeclared,       ///< the reference does not declare it
+        kTimeOfCollection,  ///< the plug-in leaves it out if the default is to include
+        kLeftOutByRules
+    };
+
+    /// A property that is not compared.
+    struct TLeftOut {
+        std::string property;
+        EReason reason;
+    };
+
     /// One class that has instances in at least one inventory, or for which the client made some. Counts are of this class alone,
     /// one for each inventory, without made instances.
     struct TClass {
@@ -27,7 +41,7 @@ struct TCoverage {
         std::vector<std::size_t> instances;
         std::vector<std::size_t> madeIn;         ///< positions of the inventories that have only the one that the client made
         std::vector<std::size_t> compared;       ///< those of the inventory that the comparison looked for in the others
-        std::vector<std::string> leftOut;        ///< properties not compared, ascending; empty unless the state is kCompared
+        std::vector<TLeftOut> leftOut;           ///< ascending by name; empty unless the state is kCompared
         std::vector<std::string> excludedKeys;   ///< in the order of the rules, also those that are no keys of the class
         std::vector<std::string> ignoredKeys;    ///< those of them that are keys, which hence do not identify instances
         std::vector<std::size_t> sharing;        ///< instances that have the key of an earlier one, because keys are excluded

@@ -76,7 +76,7 @@ TCoverage::EState TCoverageBuilder::Describe(TCoverage::TClass& cls)
     if (compared.empty()) {
         return WhyNothingIsCompared(cls, *declared);
     }
-    cls.leftOut = LeftOut(cls.name, compared);
+    cls.leftOut = LeftOut(*declared, compared);
     DescribeExcludedKeys(cls, fInventories, fRules, compared);
     return TCoverage::kCompared;
 }
@@ -101,22 +101,48 @@ void TCoverageBuilder::CountCompared(TCoverage::TClass& cls) const
 }
 
 // The properties of all inventories count: with --strict-schema, others may declare some that the reference does not.
-std::vector<std::string> TCoverageBuilder::LeftOut(const std::string& className, const std::vector<std::string>& compared) const
+std::vector<TCoverage::TLeftOut> TCoverageBuilder::LeftOut(const TInMemClass& declared, const std::vector<std::string>& compared)
 {
     const std::set<std::string, TNameText::TLess> taken(compared.begin(), compared.end());
-    std::set<std::string, TNameText::TLess> leftOut;
+    std::set<std::string, TNameText::TLess> names;
     for (const TInventory& inventory : fInventories) {
-        if (const boost::shared_ptr<TInMemClass> cls = inventory.ns->FindClass(className)) {
+        if (const boost::shared_ptr<TInMemClass> cls = inventory.ns->FindClass(declared.GetName())) {
             for (const std::uint32_t slot : cls->GetLayout().GetOrder()) {
                 if (taken.count(cls->GetLayout().GetDecl(slot).GetName()) == 0) {
-                    leftOut.insert(cls->GetLayout().GetDecl(slot).GetName());
+                    names.insert(cls->GetLayout().GetDecl(slot).GetName());
                 }
             }
         }
     }
-    std::vector<std::string> names(leftOut.begin(), leftOut.end());
-    std::sort(names.begin(), names.end());
-    return names;
+    std::vector<TCoverage::TLeftOut> leftOut;
+    for (const std::string& name : names) {
+        leftOut.push_back({name, WhyLeftOut(declared, name)});
+    }
+    std::sort(leftOut.begin(), leftOut.end(),
+              [](const TCoverage::TLeftOut& a, const TCoverage::TLeftOut& b) { return a.property < b.property; });
+    return leftOut;
+}
+
+TCoverage::EReason TCoverageBuilder::WhyLeftOut(const TInMemClass& declared, const std::string& property)
+{
+    if (IsUsedAsKey(declared.GetName(), property)) {
+        return TCoverage::kUsedAsKey;
+    }
+    if (!declared.FindPropertyDecl(property)) {
+        return TCoverage::kNotDeclared;
+    }
+    const bool isIncluded = fTrace.Decide(declared.GetName(), property).treatment == TCIMDiffEngine::INCLUDE;
+    return isIncluded && property == kCollectionTime ? TCoverage::kTimeOfCollection : TCoverage::kLeftOutByRules;
+}
+
+// Whether the property is among the keys by which instances of any inventory are matched.
+bool TCoverageBuilder::IsUsedAsKey(const std::string& className, const std::string& property)
+{
+    return std::any_of(fInventories.begin(), fInventories.end(), [&](const TInventory& inventory) {
+        const boost::shared_ptr<TInMemClass> cls = inventory.ns->FindClass(className);
+        const boost::shared_ptr<TInMemPropertyDecl> decl = cls ? cls->FindPropertyDecl(property) : nullptr;
+        return decl && decl->IsKey() && !fRules.ExcludesKey(className, decl->GetName());
+    });
 }
 
 std::vector<std::size_t> TCoverageBuilder::CountInstances(const std::string& className) const

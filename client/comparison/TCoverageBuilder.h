@@ -6,6 +6,7 @@
 
 #include "client/comparison/TCoverage.h"
 #include "client/inventory/TInventory.h"
+#include "client/rules/TRuleTrace.h"
 #include "client/rules/TRules.h"
 
 namespace NORVZEL20 {
@@ -16,7 +17,7 @@ class TCoverageBuilder {
   public:
     /// The arguments must outlive this. The inventories are those of the run, in its order.
     TCoverageBuilder(const std::vector<TInventory>& inventories, TRules& rules, const std::vector<TSchemaNote>& notes)
-        : fInventories(inventories), fRules(rules), fNotes(notes)
+        : fInventories(inventories), fRules(rules), fTrace(rules.GetDocument(), inventories[0].ns), fNotes(notes)
     {}
 
     /// Errors: TZELException of a namespace; std::bad_alloc. Cost: with excluded keys, one key for each instance of the class.
@@ -27,11 +28,14 @@ class TCoverageBuilder {
     TCoverage::EState Describe(TCoverage::TClass& cls);
     TCoverage::EState WhyNothingIsCompared(const TCoverage::TClass& cls, const TInMemClass& declared) const;
     void CountCompared(TCoverage::TClass& cls) const;
-    std::vector<std::string> LeftOut(const std::string& className, const std::vector<std::string>& compared) const;
+    std::vector<TCoverage::TLeftOut> LeftOut(const TInMemClass& declared, const std::vector<std::string>& compared);
+    TCoverage::EReason WhyLeftOut(const TInMemClass& declared, const std::string& property);
+    bool IsUsedAsKey(const std::string& className, const std::string& property);
     std::vector<std::size_t> CountInstances(const std::string& className) const;
 
     const std::vector<TInventory>& fInventories;
     TRules& fRules;
+    TRuleTrace fTrace;
     const std::vector<TSchemaNote>& fNotes;
 };
 

@@ -52,19 +52,40 @@ const char* NoteName(TSchemaNote::EKind kind)
     }
 }
 
+const char* ReasonName(TCoverage::EReason reason)
+{
+    switch (reason) {
+    case TCoverage::kUsedAsKey:
+        return "usedAsKey";
+    case TCoverage::kNotDeclared:
+        return "notDeclared";
+    case TCoverage::kTimeOfCollection:
+        return "timeOfCollection";
+    default:
+        return "excludedByRules";
+    }
+}
+
 TJson JsonOfCoveredClass(const TComparisonReport& report, const TCoverage::TClass& cls)
 {
+    TJson leftOut = TJson::array();
+    TJson reasons = TJson::array();
+    for (const TCoverage::TLeftOut& property : cls.leftOut) {
+        leftOut.push_back(property.property);
+        reasons.push_back({{"property", property.property}, {"reason", ReasonName(property.reason)}});
+    }
     TJson json = {{"class", cls.name},
                   {"state", StateName(cls.state)},
                   {"instances", cls.instances},
-                  {"propertiesLeftOut", cls.leftOut},
+                  {"propertiesLeftOut", leftOut},
                   {"excludedKeys", cls.excludedKeys},
                   {"sharingKeys", cls.sharing},
                   {"instancesCompared", cls.compared},
                   {"ignoredKeys", cls.ignoredKeys},
                   {"sharingKeysWithoutPartner", cls.sharingAlone},
                   {"referencesReduced", cls.reducedReferences},
-                  {"referenceKeysLeftOut", cls.referenceKeys}};
+                  {"referenceKeysLeftOut", cls.referenceKeys},
+                  {"leftOutReasons", reasons}};
     if (!cls.madeIn.empty()) {
         TJson labels = TJson::array();
         for (const std::size_t inventory : cls.madeIn) {

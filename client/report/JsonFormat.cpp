@@ -8,7 +8,8 @@
 //     "coverage": { "classes": [ { "class": "Disk", "state": "compared", "instances": [ 1, 1 ], "propertiesLeftOut": [ "Model" ],
 //                                  "excludedKeys": [], "sharingKeys": [ 0, 0 ], "instancesCompared": [ 1, 1 ],
 //                                  "ignoredKeys": [], "sharingKeysWithoutPartner": [ 0, 0 ], "referencesReduced": false,
-//                                  "referenceKeysLeftOut": [] } ],
+//                                  "referenceKeysLeftOut": [],
+//                                  "leftOutReasons": [ { "property": "Model", "reason": "excludedByRules" } ] } ],
 //                   "classesWithoutInstances": 0,
 //                   "schema": [ { "kind": "propertyDeclared", "inventory": "web02", "asIn": "web01", "class": "Disk",
 //                                 "property": "Model" } ] } }

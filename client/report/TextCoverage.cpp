@@ -4,7 +4,8 @@
 //   3 classes have no instances in any inventory.
 //   Not compared, because the rules exclude every property: Process (12 / 7).
 //   KALMO_OperatingSystem not compared in web03, because cimdelta made the instance there.
-//   Properties of Disk not compared: Caption, Model.
+//   Properties of Disk not compared, because the rules leave them out: Caption, Model.
+//   Properties of Disk used as keys, not compared as properties: Id.
 //   Instances of Disk with the key of an earlier one, since the rules leave out Bus: 2 of web01, not compared; ...
 //   References of Mount were compared without key Bus and without their namespace.
 //   Declared in web02 as in web01: class Tape, Disk.Model.
@@ -116,10 +117,27 @@ class TStatement {
     void WriteLeftOut()
     {
         for (const TCoverage::TClass& cls : fCoverage.classes) {
-            if (!cls.leftOut.empty()) {
-                fOut += "Properties of " + EscapeForDisplay(cls.name) + " not compared: " + EscapeForDisplay(SomeOf(cls.leftOut)) +
-                        ".\n";
+            const std::string name = EscapeForDisplay(cls.name);
+            WriteLeftOut(cls, TCoverage::kLeftOutByRules,
+                         "Properties of " + name + " not compared, because the rules leave them out");
+            WriteLeftOut(cls, TCoverage::kTimeOfCollection,
+                         "Property of " + name + " not compared, because it is the time of collection");
+            WriteLeftOut(cls, TCoverage::kNotDeclared,
+                         "Properties of " + name + " not compared, because " + Label(0) + " does not declare them");
+            WriteLeftOut(cls, TCoverage::kUsedAsKey, "Properties of " + name + " used as keys, not compared as properties");
+        }
+    }
+
+    void WriteLeftOut(const TCoverage::TClass& cls, TCoverage::EReason reason, const std::string& title)
+    {
+        std::vector<std::string> names;
+        for (const TCoverage::TLeftOut& leftOut : cls.leftOut) {
+            if (leftOut.reason == reason) {
+                names.push_back(leftOut.property);
             }
+        }
+        if (!names.empty()) {
+            fOut += title + ": " + EscapeForDisplay(SomeOf(names)) + ".\n";
         }
     }
 

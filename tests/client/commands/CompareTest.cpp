@@ -43,7 +43,7 @@ TEST_F(CompareTest, APairIsReportedWithOldAndNewValues)
               "\n"
               "Compared: 4 classes; 6 instances of web01, 6 instances of web02.\n"
               "1 class has no instances in any inventory.\n"
-              "Properties of KALMO_OperatingSystem not compared: DateTimeOfCollection.\n",
+              "Property of KALMO_OperatingSystem not compared, because it is the time of collection: DateTimeOfCollection.\n",
               Result({"compare", "web01.xml", "web02.xml"}));
     EXPECT_EQ(1, fStatus);
 }
@@ -74,7 +74,7 @@ TEST_F(CompareTest, OfSeveralInventoriesEqualValuesStandTogether)
               "\n"
               "Compared: 4 classes; 6 instances of web01, 6 instances of web02, 7 instances of web03.\n"
               "1 class has no instances in any inventory.\n"
-              "Properties of KALMO_OperatingSystem not compared: DateTimeOfCollection.\n",
+              "Property of KALMO_OperatingSystem not compared, because it is the time of collection: DateTimeOfCollection.\n",
               Result({"compare", "web01.xml", "web02.xml", "web03.xml"}));
     EXPECT_EQ(1, fStatus);
 }
@@ -85,7 +85,7 @@ TEST_F(CompareTest, WhatIsEqualInAnotherOrderIsNoDifference)
               "\n"
               "Compared: 4 classes; 6 instances of web01, 6 instances of web01-again.\n"
               "1 class has no instances in any inventory.\n"
-              "Properties of KALMO_OperatingSystem not compared: DateTimeOfCollection.\n",
+              "Property of KALMO_OperatingSystem not compared, because it is the time of collection: DateTimeOfCollection.\n",
               Result({"compare", "web01.xml", "web01-again.xml"}));
     EXPECT_EQ(0, fStatus);
 }
@@ -134,8 +134,8 @@ TEST_F(CompareTest, RulesSayWhatCountsAndTheReportSaysSo)
               "1 class has no instances in any inventory.\n"
               "Not compared, because no element of the rules is for the class or one above it: INV_Service (1 / 1), "
               "KALMO_OperatingSystem (1 / 1).\n"
-              "Properties of INV_Disk not compared: BootId.\n"
-              "Properties of INV_Package not compared: Size.\n",
+              "Properties of INV_Disk not compared, because the rules leave them out: BootId.\n"
+              "Properties of INV_Package not compared, because the rules leave them out: Size.\n",
               Result({"compare", "--spec", "rules.xml", "web01.xml", "web02.xml"}));
 }
 
@@ -166,8 +166,8 @@ TEST_F(CompareTest, InstancesThatShareAKeyAreReported)
         "1 class has no instances in any inventory.\n"
         "Not compared, because no element of the rules is for the class or one above it: INV_Service (1 / 0), "
         "KALMO_OperatingSystem (1 / 1).\n"
-        "Properties of INV_Disk not compared: BootId.\n"
-        "Properties of INV_Package not compared: Size.\n"
+        "Properties of INV_Disk not compared, because the rules leave them out: BootId.\n"
+        "Properties of INV_Package not compared, because the rules leave them out: Size.\n"
         "Instances of INV_Disk with the key of an earlier one, since the rules leave out BootId: 1 of two-boots, compared with the "
         "same instance of web02 as the earlier one.\n",
         Result({"compare", "--spec", "rules.xml", "web02.xml", "two-boots.xml"}));
@@ -280,7 +280,7 @@ TEST_F(CompareTest, TypesAndKeysThatDifferAreReportedAndCompared)
               "\n"
               "Compared: 4 classes; 6 instances of web01, 4 instances of other-types.\n"
               "1 class has no instances in any inventory.\n"
-              "Properties of KALMO_OperatingSystem not compared: DateTimeOfCollection.\n"
+              "Property of KALMO_OperatingSystem not compared, because it is the time of collection: DateTimeOfCollection.\n"
               "Declared in other-types as in web01: INV_Disk.BootId, class INV_Element, class INV_Service.\n"
               "Identified by other keys in other-types than in web01: INV_Disk; instances match only under rules that exclude the "
               "keys that "

@@ -173,7 +173,7 @@ TEST_F(SchemaNotesTest, ATimeOfCollectionIsLeftOutInEveryLetterCase)
     const std::string coverage = "No differences between a and b, times of collection aside.\n"
                                  "\n"
                                  "Compared: 2 classes; 2 instances of a, 2 instances of b.\n"
-                                 "Properties of Disk not compared: DateTimeOfCollection.\n";
+                                 "Property of Disk not compared, because it is the time of collection: DateTimeOfCollection.\n";
     const std::string inA = "Spelled in a as comparisons require: Disk.DateTimeOfCollection (was datetimeofcollection).\n";
     const std::string inB = "Spelled in b as comparisons require: Disk.DateTimeOfCollection (was DATETIMEOFCOLLECTION).\n";
     EXPECT_EQ(coverage + inA + inB, Compare(collected("datetimeofcollection", "x"), collected("DATETIMEOFCOLLECTION", "y")));

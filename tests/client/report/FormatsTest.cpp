@@ -15,7 +15,7 @@ class FormatsTest : public TClientFixture {
         return "{\"class\":\"" + name + "\",\"state\":\"" + state + "\",\"instances\":[" + instances +
                "],\"propertiesLeftOut\":[],\"excludedKeys\":[],\"sharingKeys\":[0,0,0],\"instancesCompared\":[" + compared +
                "],\"ignoredKeys\":[],\"sharingKeysWithoutPartner\":[0,0,0],\"referencesReduced\":false,"
-               "\"referenceKeysLeftOut\":[]}";
+               "\"referenceKeysLeftOut\":[],\"leftOutReasons\":[]}";
     }
 };
 
