@@ -24,7 +24,7 @@ struct TDifference {
     std::string instance;                                 ///< the key by which instances were matched, as path text
     std::vector<std::pair<std::string, TCIMValue>> keys;  ///< the same, key by key, in the class's order
     bool hasKeys = true;                                  ///< whether the class has keys; otherwise it has one instance at most
-    std::string path;                      ///< only of kOnlyInReference, if the rules exclude keys: the instance's whole path
+    std::string path;                      ///< only of kOnlyInReference, if the rules of the class exclude keys: the whole path
     std::string property;                  ///< only of kChanged
     std::vector<std::size_t> inventories;  ///< the positions of those that differ, ascending, each once
     /// For each inventory of the run, how many instances have the key. Only the reference and `inventories` are counted. Empty if

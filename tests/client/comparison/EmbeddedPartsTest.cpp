@@ -53,6 +53,16 @@ TEST_F(EmbeddedPartsTest, ThePropertiesThatDifferAreShown)
                            BoxOf(Config(""))}));
 }
 
+TEST_F(EmbeddedPartsTest, QualifiersArePartOfTheValue)
+{
+    EXPECT_EQ(
+        "Box\n"
+        "~ Id=\"1\"\n"
+        "    S: \"<INSTANCE CLASSNAME=\\\"Cfg\\\"></INSTANCE>\" -> \"<INSTANCE CLASSNAME=\\\"Cfg\\\"><QUALIFIER NAME=\\\"Q\\\" "
+        "TYPE=\\\"boolean\\\"><VALUE>TRUE</VALUE></QUALIFIER></INSTANCE>\"\n",
+        Differences({BoxOf(Config("")), BoxOf(Config(Qualifier("Q")))}));
+}
+
 TEST_F(EmbeddedPartsTest, ThoseOfAnObjectWithinAnObjectToo)
 {
     EXPECT_EQ("Box\n~ Id=\"1\"\n    S.Inner.Speed: 1 -> 2\n", Differences({BoxOf(Config(Embedded("Inner", Config(Speed("1"))))),

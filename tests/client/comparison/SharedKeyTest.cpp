@@ -82,6 +82,19 @@ TEST_F(SharedKeyTest, OfSeveralInventoriesAPathStandsBehindThoseThatLackIt)
               Differences({Declared() + OfSize("1", "5"), Declared(), Declared() + OfSize("2", "5")}));
 }
 
+TEST_F(SharedKeyTest, OnlyAClassWhoseRulesExcludeKeysHasPaths)
+{
+    Rules("<class name='Disk' default='include' excludekeys='Boot'><excludelist><value>Boot</value></excludelist></class>"
+          "<class name='Tape' default='include'/>");
+    const std::string tapes = Class("Tape", "", KeyProperty("Id"));
+    const std::vector<std::string> documents = {Declared() + OfSize("1", "5") + tapes + Instance("Tape", Value("Id", "t")),
+                                                Declared() + tapes};
+    EXPECT_EQ("Disk\n- Id=\"sda\"  (path: root/cimv2:Disk.Boot=\"1\",Id=\"sda\")\n\nTape\n- Id=\"t\"\n", Differences(documents));
+    const std::string records = Compare(documents, {"-o", "cimxml"});
+    EXPECT_NE(std::string::npos, records.find("<VALUE>Tape.Id=\"t\"</VALUE>")) << records;
+    EXPECT_NE(std::string::npos, records.find("<VALUE>root/cimv2:Disk.Boot=\"1\",Id=\"sda\"</VALUE>")) << records;
+}
+
 TEST_F(SharedKeyTest, InstancesThatTheReferenceLacksAreAllNamed)
 {
     const std::string two = Declared() + OfSize("1", "5") + OfSize("2", "6");

@@ -209,6 +209,31 @@ TEST_F(StrictSchemaTest, NamesThatDifferInLetterCaseAreReported)
               Result({"compare", "--strict-schema", "-o", "ndjson", a, b, c}).find("\"kind\":\"spellingDiffers\""));
 }
 
+/// A run over two inventories adds what the other one has to the reference, which takes names in any letter case for the same.
+TEST_F(StrictSchemaTest, OfTwoInventoriesNamesInAnotherLetterCaseFailOverTheSameInstance)
+{
+    const std::string a = Disks(KeyProperty("Id"), Disk(Value("Id", "1")));
+    const struct {
+        const char* what;
+        std::string same;
+        std::string different;
+    } rows[] = {
+        {"class", Disks(KeyProperty("Id"), Disk(Value("Id", "1"), "disk"), "disk"),
+         Disks(KeyProperty("Id"), Disk(Value("Id", "2"), "disk"), "disk")},
+        {"key", Disks(KeyProperty("ID"), Disk(Value("ID", "1"))), Disks(KeyProperty("ID"), Disk(Value("ID", "2")))},
+    };
+    for (const auto& row : rows) {
+        const std::string message = Compare(a, row.same, {"--strict-schema"});
+        EXPECT_EQ(2, fStatus) << row.what;
+        EXPECT_NE(std::string::npos, message.find("=\"1\" of b.xml cannot be added to a.xml: ")) << message;
+        const std::string report = Compare(a, row.different, {"--strict-schema"});
+        EXPECT_EQ("2 differences between a and b: 1 instance only in a, 1 instance only in b\n",
+                  report.substr(0, report.find('\n') + 1))
+            << row.what;
+        EXPECT_NE(std::string::npos, report.find(" in b, so instances do not match.\n")) << report;
+    }
+}
+
 TEST_F(StrictSchemaTest, ATimeOfCollectionInAnotherLetterCaseIsCompared)
 {
     const auto collected = [](const std::string& time) {
