@@ -18,9 +18,8 @@ const struct {
     std::string_view begin;
     const char* kind;
 } kMarks[] = {
-    {"\x1f\x8b", "gzip"}, {{"\xfd\x37zXZ\x00", 6}, "xz"}, {"\x28\xb5\x2f\xfd", "zstd"},
-    {"BZh", "bzip2"},     {"\x04\x22\x4d\x18", "lz4"},    {"PK\x03\x04", "zip"},
-    {"LZIP", "lzip"},
+    {"\x1f\x8b", "gzip"},  {kXzMagic, "xz"}, {"\x28\xb5\x2f\xfd", "zstd"}, {"BZh", "bzip2"}, {"\x04\x22\x4d\x18", "lz4"},
+    {"PK\x03\x04", "zip"}, {"LZIP", "lzip"},
 };
 
 }  // namespace

@@ -78,7 +78,11 @@ long TArchiveReader::Fill(archive* reader, void* self, const void** block)
     auto& file = *static_cast<TArchiveReader*>(self);
     try {
         *block = file.fBlock.data();
-        return static_cast<long>(file.fCompressed.Read(file.fBlock.data(), file.fBlock.size()));
+        const std::size_t size = file.fCompressed.Read(file.fBlock.data(), file.fBlock.size());
+        if (file.fKind == "xz") {
+            file.fXzEnd.Watch({file.fBlock.data(), size});
+        }
+        return static_cast<long>(size);
     } catch (...) {
         file.fFault = std::current_exception();
         archive_set_error(reader, EIO, "reading failed");
@@ -95,6 +99,10 @@ void TArchiveReader::Fail() const
     const std::string reason = message == nullptr ? "unknown reason" : message;
     if (archive_errno(fArchive.get()) == ENOMEM || Contains(reason, "not enough memory")) {
         FailForMemory(fName);
+    }
+    // The first frame of zstd data begins with the right descriptor, or it would not have been recognized.
+    if (fXzEnd.HasOtherData() || Contains(reason, "Unknown frame descriptor")) {
+        FailDamaged(fName, fKind, kSomethingFollows);
     }
     // The compression libraries describe data that ends early in several ways, not all of which a person would understand.
     const bool endsEarly = Contains(reason, "No progress is possible") || Contains(reason, "runcated");

@@ -6,6 +6,7 @@
 #include <vector>
 
 #include "client/files/IByteSource.h"
+#include "client/files/TXzEnd.h"
 
 struct archive;
 
@@ -35,6 +36,7 @@ class TArchiveReader : public IByteSource {
     std::exception_ptr fFault;  // thrown by fCompressed, kept until the C library has returned
     std::unique_ptr<archive, int (*)(archive*)> fArchive;
     bool fEmpty = false;
+    TXzEnd fXzEnd;  // of xz data
 };
 
 }  // namespace NORVZEL20

@@ -57,7 +57,7 @@ bool TGzipReader::HasMore()
         return filled;
     }
     if (*fStream.next_in != kFirstOfMember) {
-        FailDamaged(fName, kKind, "something else follows it");
+        FailDamaged(fName, kKind, kSomethingFollows);
     }
     fInMember = inflateReset(&fStream) == Z_OK;
     return true;

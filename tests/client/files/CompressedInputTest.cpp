@@ -3,8 +3,11 @@
 
 #include <zlib.h>
 
+#include <algorithm>
+#include <string_view>
 #include <utility>
 
+#include "client/files/TXzEnd.h"
 #include "tests/client/TClientFixture.h"
 
 namespace NORVZEL20 {
@@ -117,23 +120,53 @@ TEST_F(CompressedInputTest, SeveralMembersAreOneText)
 
 TEST_F(CompressedInputTest, WhatStandsBehindTheDataIsRefused)
 {
-    const struct {
-        const char* file;
-        const char* reason;
-    } rows[] = {
-        {"web02.xml.gz", "the gzip data is damaged (something else follows it)"},
-        {"web02.xml.xz", "the xz data is damaged (Lzma library error: Corrupted input data)"},
-        {"web02.xml.zst", "the zstd data is damaged (Zstd decompression failed: Unknown frame descriptor)"},
-    };
-    for (const auto& row : rows) {
-        EXPECT_EQ(std::string("cimdelta: F: cannot be read: ") + row.reason + "; fetch or make it anew\n",
-                  Show(ReadFile(row.file) + "<!-- garbage -->"));
-        EXPECT_EQ(fWhole, Show(ReadFile(row.file)));
+    const std::pair<const char*, const char*> files[] = {
+        {"gzip", "web02.xml.gz"}, {"xz", "web02.xml.xz"}, {"zstd", "web02.xml.zst"}};
+    const std::string tails[] = {
+        "x", "\n", "<!-- garbage -->", std::string(1, '\0'), std::string(8, '\0') + "x", std::string(100000, 'Y')};
+    for (const auto& file : files) {
+        for (const std::string& tail : tails) {
+            EXPECT_EQ(std::string("cimdelta: F: cannot be read: the ") + file.first +
+                          " data is damaged (something else follows it); fetch or make it anew\n",
+                      Show(ReadFile(file.second) + tail))
+                << file.first << " " << tail.substr(0, 20);
+        }
+        EXPECT_EQ(fWhole, Show(ReadFile(file.second)));
     }
+    EXPECT_EQ(fWhole, Show(ReadFile("web02.xml.xz") + std::string(8, '\0')));
+}
+
+TEST_F(CompressedInputTest, ABeginningBehindTheDataIsThatOfMoreData)
+{
     EXPECT_EQ("cimdelta: F: cannot be read: the gzip data is damaged (incorrect header check); fetch or make it anew\n",
               Show(ReadFile("web02.xml.gz") + "\x1fgarbage"));
-    EXPECT_EQ("cimdelta: F: cannot be read: the gzip data is damaged (it ends early); fetch or make it anew\n",
-              Show(ReadFile("web02.xml.gz") + "\x1f"));
+    const std::pair<const char*, const char*> files[] = {
+        {"gzip", "web02.xml.gz"}, {"xz", "web02.xml.xz"}, {"zstd", "web02.xml.zst"}};
+    for (const auto& file : files) {
+        const std::string data = ReadFile(file.second);
+        for (const std::size_t size : {1, 8, 20}) {
+            EXPECT_EQ(std::string("cimdelta: F: cannot be read: the ") + file.first +
+                          " data is damaged (it ends early); fetch or make it anew\n",
+                      Show(data + data.substr(0, size)))
+                << file.first << " " << size;
+        }
+    }
+}
+
+/// A footer may be in two of the pieces in which a file is read.
+TEST_F(CompressedInputTest, TheEndOfXzDataIsFoundInPieces)
+{
+    const std::string data = ReadFile("web02.xml.xz");
+    for (std::size_t piece = 1; piece < 30; ++piece) {
+        TXzEnd end;
+        const std::string file = data + data + "x";
+        for (std::size_t at = 0; at + 1 < file.size(); at += piece) {
+            end.Watch(std::string_view(file).substr(at, std::min(piece, file.size() - 1 - at)));
+        }
+        EXPECT_FALSE(end.HasOtherData()) << piece;
+        end.Watch("x");
+        EXPECT_TRUE(end.HasOtherData()) << piece;
+    }
 }
 
 TEST_F(CompressedInputTest, DamageIsReportedRatherThanItsConsequence)
