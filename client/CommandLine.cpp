@@ -14,8 +14,10 @@
 #include <boost/algorithm/string/join.hpp>
 #include <exception>
 #include <functional>
+#include <memory>
 #include <sstream>
 
+#include "client/WrongUsage.h"
 #include "client/commands/CheckCommand.h"
 #include "client/commands/CompareCommand.h"
 #include "client/commands/ExplainCommand.h"
@@ -89,6 +91,21 @@ std::string RefuseEmpty(const std::string& text)
     return text.empty() ? "must not be empty" : "";
 }
 
+// Names the options that a command cannot do without in its first line.
+class THelp : public CLI::Formatter {
+  public:
+    std::string make_usage(const CLI::App* command, std::string name) const override
+    {
+        std::string usage = CLI::Formatter::make_usage(command, name);
+        for (const CLI::Option* option : command->get_options()) {
+            if (option->get_required() && option->nonpositional()) {
+                usage.insert(usage.find(name) + name.size(), " " + option->get_name() + " " + option->get_option_text());
+            }
+        }
+        return usage;
+    }
+};
+
 // Declares the arguments of every command, parses a command line and runs the command that it names.
 class TCommandLine {
   public:
@@ -96,8 +113,11 @@ class TCommandLine {
     {
         AddVersion(fApp);
         fApp.require_subcommand(1);
-        fApp.footer("Exit status: 0 for success (compare: no differences), 1 for differences, 2 for trouble.\n"
-                    "cimdelta help COMMAND describes one command.");
+        fApp.formatter(std::make_shared<THelp>());
+        fApp.footer(
+            "Exit status: 0 done (compare: no differences in what was compared), 1 differences, 2 error (compare: or nothing was\n"
+            "compared).\n"
+            "cimdelta help COMMAND describes one command.");
         AddCompare();
         AddCheck();
         AddExplain();
@@ -210,7 +230,8 @@ class TCommandLine {
             return Refuse(wrong, console);
         }
         return Refuse(chosen.empty() ? "name a command: " + Alternatives(CommandNames()) + "; see cimdelta --help"
-                                     : Unguard(error.what()) + "; see cimdelta " + chosen[0]->get_name() + " --help",
+                                     : Unguard(DescribeWrongUsage(error, fApp, *chosen[0])) + "; see cimdelta " +
+                                           chosen[0]->get_name() + " --help",
                       console);
     }
 
@@ -231,11 +252,16 @@ class TCommandLine {
 
     static void AddFormat(CLI::App* command, EOutputFormat& format)
     {
-        const std::function<void(const std::string&)> set = [&format](const std::string& name) { format = OutputFormatOf(name); };
+        const std::function<void(const std::string&)> set = [&format](const std::string& name) {
+            const std::vector<std::string> names = OutputFormatNames();
+            if (std::find(names.begin(), names.end(), name) == names.end()) {
+                throw CLI::ValidationError(name + " is no format; name one: " + Alternatives(names));
+            }
+            format = OutputFormatOf(name);
+        };
         command->add_option_function("-o,--format", set, Alternatives(OutputFormatNames()) + " (default: text)")
             ->transform(&Unguard)
             ->check(&RefuseEmpty)
-            ->check(CLI::IsMember(OutputFormatNames()))
             ->option_text("FORMAT");
     }
 

@@ -261,10 +261,9 @@ TEST_F(BadInputTest, BracketsAreNoList)
 {
     EXPECT_EQ("cimdelta: [a,b]: cannot be opened: No such file or directory\n", Complaint({"compare", "web01.xml", "[a,b]"}));
     EXPECT_EQ("cimdelta: [a]: cannot be opened: No such file or directory\n", Complaint({"show", "[a]"}));
-    EXPECT_EQ("cimdelta: --format: [json] not in {text,json,ndjson,cimxml}; see cimdelta show --help\n",
+    EXPECT_EQ("cimdelta: [json] is no format; name one: text, json, ndjson or cimxml; see cimdelta show --help\n",
               Complaint({"show", "web01.xml", "-o", "[json]"}));
-    EXPECT_EQ("cimdelta: The following argument was not expected: [c]; see cimdelta show --help\n",
-              Complaint({"show", "web01.xml", "b", "[c]"}));
+    EXPECT_EQ("cimdelta: [c] is one argument too many; see cimdelta show --help\n", Complaint({"show", "web01.xml", "b", "[c]"}));
 }
 
 TEST_F(BadInputTest, ALongKeyMakesNoLongMessage)

@@ -23,6 +23,19 @@ TEST_F(UsageTest, HelpIsACommandToo)
     }
 }
 
+TEST_F(UsageTest, HelpNamesWhatIsRequiredAndTheExitStatuses)
+{
+    EXPECT_NE(std::string::npos,
+              Result({"explain", "--help"}).find("\nUsage: cimdelta explain --schema INVENTORY [OPTIONS] ELEMENT\n"))
+        << fOut;
+    EXPECT_NE(std::string::npos, Result({"compare", "--help"}).find("\nUsage: cimdelta compare [OPTIONS] REFERENCE OTHER...\n"))
+        << fOut;
+    EXPECT_NE(
+        std::string::npos,
+        Result({"--help"}).find("Exit status: 0 done (compare: no differences in what was compared), 1 differences, 2 error "))
+        << fOut;
+}
+
 TEST_F(UsageTest, EachCommandKnowsTheVersion)
 {
     const std::string version = Result({"--version"});
@@ -66,9 +79,15 @@ TEST_F(UsageTest, WrongUsageIsReportedInOneLine)
          "--schma is no option of cimdelta explain; did you mean --schema?"},
         {{"compare", "web01.xml", "web02.xml", "--wrong"}, "--wrong is no option of cimdelta compare; see cimdelta compare --help"},
         {{"compare", "-x", "web01.xml", "web02.xml"}, "-x is no option of cimdelta compare; see cimdelta compare --help"},
-        {{"show", "a", "b", "c"}, "The following argument was not expected: c; see cimdelta show --help"},
+        {{"show", "a", "b", "c"}, "c is one argument too many; see cimdelta show --help"},
+        {{"check", "a", "b", "c"}, "b, c are 2 arguments too many; see cimdelta check --help"},
+        {{"compare", "--spec", "a", "--spec", "b", "web01.xml", "web02.xml"},
+         "--spec can be given only once; see cimdelta compare --help"},
+        {{"show", "-o", "json", "--format=json", "web01.xml"}, "-o,--format can be given only once; see cimdelta show --help"},
+        {{"compare", "web01.xml", "web02.xml", "--spec"}, "--spec needs a value; see cimdelta compare --help"},
+        {{"show", "web01.xml", "-o"}, "-o,--format needs a value; see cimdelta show --help"},
         {{"compare", "-o", "html", "web01.xml", "web02.xml"},
-         "--format: html not in {text,json,ndjson,cimxml}; see cimdelta compare --help"},
+         "html is no format; name one: text, json, ndjson or cimxml; see cimdelta compare --help"},
     };
     for (const auto& row : rows) {
         EXPECT_EQ("cimdelta: " + row.message + "\n", Complaint(row.arguments));
