@@ -6,6 +6,7 @@
 //   other control characters below U+0080                  \x1b
 //   U+0080 to U+009F, which terminals take for escapes     \u009b
 //   marks of direction, line and paragraph separators      \u202e
+//   what is invisible or looks like a blank                \u00a0
 //   bytes that are not UTF-8, overlong forms included      \xff
 //
 // A value is also quoted if a reader could not otherwise see its beginning and end, or which of its backslashes are its own.
@@ -17,12 +18,13 @@ namespace NORVZEL20 {
 
 namespace {
 
-// Control characters; the marks, embeddings, overrides and isolates of bidirectional text; the separators U+2028 and U+2029; the
-// byte order mark, which is invisible.
+// Control characters and the no-break space; the soft hyphen; blanks of other widths, joiners and other characters without a width;
+// the marks, embeddings, overrides and isolates of bidirectional text; the separators U+2028 and U+2029; the byte order mark.
 bool IsUnsafe(char32_t code)
 {
-    return code < 0x20 || (code >= 0x7F && code < 0xA0) || code == 0x061C || code == 0x200E || code == 0x200F ||
-           (code >= 0x2028 && code <= 0x202E) || (code >= 0x2066 && code <= 0x2069) || code == 0xFEFF;
+    return code < 0x20 || (code >= 0x7F && code <= 0xA0) || code == 0xAD || code == 0x061C || code == 0x180E ||
+           (code >= 0x2000 && code <= 0x200F) || (code >= 0x2028 && code <= 0x202F) || (code >= 0x205F && code <= 0x206F) ||
+           code == 0xFEFF;
 }
 
 void AppendHex(std::string& out, char32_t code, int digits)

@@ -8,7 +8,8 @@
 namespace NORVZEL20 {
 
 /// Text from an inventory as a terminal can safely show it, in one line: control characters, characters that change the direction
-/// of writing or end a line, and bytes that are not UTF-8 become escapes (\n, \t, \x1b, \u202e). Everything else stays.
+/// of writing, end a line, are invisible or look like a blank, and bytes that are not UTF-8 become escapes (\n, \t, \x1b, \u202e,
+/// \u00a0). Everything else stays.
 std::string EscapeForDisplay(std::string_view text);
 
 /// The label of an inventory (see MakeInventoryLabels) as a part of a sentence or a list. A label is put in double quotes if it

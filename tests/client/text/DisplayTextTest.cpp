@@ -40,6 +40,28 @@ TEST(EscapeForDisplay, ShowsWhatWouldActOnATerminal)
     }
 }
 
+TEST(EscapeForDisplay, ShowsWhatIsInvisibleOrLooksLikeABlank)
+{
+    const struct {
+        const char* text;
+        const char* shown;
+    } rows[] = {
+        {"a\u00a0b", "a\\u00a0b"},  // no-break space
+        {"a\u202fb", "a\\u202fb"},  // narrow no-break space
+        {"a\u2003b", "a\\u2003b"},  // em space
+        {"a\u00adb", "a\\u00adb"},  // soft hyphen
+        {"a\u200bb", "a\\u200bb"},  // zero width space
+        {"a\u200db", "a\\u200db"},  // zero width joiner
+        {"a\u2060b", "a\\u2060b"},  // word joiner
+        {"a\ufeffb", "a\\ufeffb"},  // byte order mark
+        {"a\u2010b", "a\u2010b"},   // hyphen
+        {"a\u2070b", "a\u2070b"},   // superscript zero
+    };
+    for (const auto& row : rows) {
+        EXPECT_EQ(row.shown, EscapeForDisplay(row.text));
+    }
+}
+
 TEST(DisplayLabel, IsQuotedIfItCouldBeTakenForSeveral)
 {
     const struct {
@@ -77,6 +99,7 @@ TEST(DisplayValue, DistinguishesTextsThatLookAlike)
         {TCIMValue("C:\\x"), "\"C:\\\\x\""},
         {TCIMValue("say \"x\""), "\"say \\\"x\\\"\""},
         {TCIMValue("a\nb"), "\"a\\nb\""},
+        {TCIMValue("a\u00a0b"), "\"a\\u00a0b\""},
         {TCIMValue(7u), "7"},
         {TCIMValue(true), "TRUE"},
     };
