@@ -14,6 +14,9 @@
 //                   "schema": [ { "kind": "propertyDeclared", "inventory": "web02", "asIn": "web01", "class": "Disk",
 //                                 "property": "Model" } ] } }
 //
+// A class of which cimdelta made instances ends with "madeIn": [ "web02" ]. A note may end with "before": "model", the spelling
+// that was replaced, or with "declared": "Bag" and "declaredAsIn": "Ordered"; its kind decides, also whether it has "property".
+//
 // JsonDifference.cpp shows the differences. Lists of numbers have one for each inventory, the reference first.
 #include "client/report/JsonFormat.h"
 
