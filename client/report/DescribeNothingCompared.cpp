@@ -4,6 +4,7 @@
 #include <boost/algorithm/string/join.hpp>
 #include <vector>
 
+#include "client/files/TInputFile.h"
 #include "client/inventory/TSuggestedCommand.h"
 #include "client/text/DisplayText.h"
 #include "client/text/SomeOf.h"
@@ -45,7 +46,7 @@ std::vector<std::string> Reasons(const TComparisonReport& report)
         {TCoverage::kExcludedByRules, "the rules exclude every property of ",
          " (the default is to exclude; default=\"include\" includes)"},
         {TCoverage::kNothingToCompare, "there is no property to compare in ", ""},
-        {TCoverage::kUnknownToReference, report.paths[0] + " does not declare ", ""},
+        {TCoverage::kUnknownToReference, NameOfInput(report.paths[0]) + " does not declare ", ""},
         {TCoverage::kOperatingSystemMade, "", " is not compared, since cimdelta made an instance of it"},
     };
     std::vector<std::string> reasons;
