@@ -1,18 +1,27 @@
 #include "embedded/store/InMemClassChecks.h"
 
 #include "embedded/store/TInMemClass.h"
-#include "host/TZELException.h"
+#include "embedded/store/TStoreRefusal.h"
 
 namespace NORVZEL20 {
 
 namespace {
 
-/// The layout has inherited properties too, so this covers all ancestors.
-void CheckTypeFitsHere(const TInMemLayout& layout, const TInMemPropertyDecl& decl)
+void RequireSame(const TInMemClass& cls, const char* kind, const std::string& name, TCIMValue::TCIMType present,
+                 TCIMValue::TCIMType other)
 {
-    const std::uint32_t slot = layout.FindSlot(decl.GetName());
-    if (slot != TInMemLayout::kNoSlot && layout.GetDecl(slot).GetType() != decl.GetType()) {
-        throw TZELException(TZELStatusCode::kTypeMismatch);
+    if (present != other) {
+        throw TStoreRefusal(TZELStatusCode::kTypeMismatch, [&] {
+            return kind + name + " of class " + cls.GetName() + TStoreRefusal::OfOtherType(present, other);
+        });
+    }
+}
+
+/// The class has inherited properties too, so this covers all ancestors.
+void CheckTypeFitsHere(const TInMemClass& cls, const TInMemPropertyDecl& decl)
+{
+    if (const auto present = cls.FindPropertyDecl(decl.GetName())) {
+        RequireSame(cls, "property ", present->GetName(), present->GetType(), decl.GetType());
     }
 }
 
@@ -21,14 +30,8 @@ void CheckKeyStaysHere(const TInMemClass& cls, const TInMemPropertyDecl& decl)
 {
     const auto present = cls.FindPropertyDecl(decl.GetName());
     if (cls.GetInstanceCount() > 0 && present && present->IsKey() && !present->IsKeyWithout(decl)) {
-        throw TZELException(TZELStatusCode::kClassInUse);
-    }
-}
-
-void RequireSame(TCIMValue::TCIMType a, TCIMValue::TCIMType b)
-{
-    if (a != b) {
-        throw TZELException(TZELStatusCode::kTypeMismatch);
+        throw TStoreRefusal(TZELStatusCode::kClassInUse,
+                            [&] { return "key " + present->GetName() + " of class " + cls.GetName() + ", which has instances"; });
     }
 }
 
@@ -36,9 +39,9 @@ void RequireSame(TCIMValue::TCIMType a, TCIMValue::TCIMType b)
 
 void CheckTypeFits(const TInMemClass& cls, const TInMemPropertyDecl& decl)
 {
-    CheckTypeFitsHere(cls.GetLayout(), decl);
+    CheckTypeFitsHere(cls, decl);
     for (const auto& below : cls.GetClassesBelow()) {
-        CheckTypeFitsHere(below->GetLayout(), decl);
+        CheckTypeFitsHere(*below, decl);
     }
 }
 
@@ -56,7 +59,7 @@ void CheckTypesAgree(const ICIMClass& source, const TInMemClass& target)
     source.EnumeratePropertyDecls(
         [&](boost::shared_ptr<ICIMPropertyDecl> decl) {
             if (const auto same = target.FindPropertyDecl(decl->GetName(none))) {
-                RequireSame(same->GetType(), decl->GetType(none));
+                RequireSame(target, "property ", same->GetName(), same->GetType(), decl->GetType(none));
             }
             return true;
         },
@@ -64,7 +67,7 @@ void CheckTypesAgree(const ICIMClass& source, const TInMemClass& target)
     source.EnumerateMethodDecls(
         [&](boost::shared_ptr<ICIMMethodDecl> decl) {
             if (const auto same = target.GetMethods().Find(decl->GetName(none))) {
-                RequireSame(same->GetType(), decl->GetType(none));
+                RequireSame(target, "method ", same->GetName(), same->GetType(), decl->GetType(none));
             }
             return true;
         },

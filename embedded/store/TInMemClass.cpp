@@ -13,6 +13,7 @@
 #include "embedded/store/TDeclCopy.h"
 #include "embedded/store/TInMemExtent.h"
 #include "embedded/store/TInMemNamespace.h"
+#include "embedded/store/TStoreRefusal.h"
 #include "embedded/value/EraseLast.h"
 #include "embedded/value/TNameText.h"
 #include "host/RootClassName.h"
@@ -62,7 +63,7 @@ TInMemExtent& TInMemClass::GetExtent() const
     // Without an extent, either the namespace is gone or the class is not declared in it.
     if (!fExtent) {
         RequireNamespace();
-        throw TZELException(TZELStatusCode::kNotFound);
+        throw TStoreRefusal(TZELStatusCode::kNotFound, [&] { return "class " + fName; });
     }
     return *fExtent;
 }
@@ -97,8 +98,10 @@ void TInMemClass::RemoveFromNamespace(TCallContext)
 {
     const auto ns = RequireNamespace();
     GetExtent();  // refuses a class that is not declared
-    if (!GetSubClasses().empty() || GetInstanceCount() > 0) {
-        throw TZELException(TZELStatusCode::kClassInUse);
+    const bool hasSubClasses = !GetSubClasses().empty();
+    if (hasSubClasses || GetInstanceCount() > 0) {
+        throw TStoreRefusal(TZELStatusCode::kClassInUse,
+                            [&] { return "class " + fName + " has " + (hasSubClasses ? "subclasses" : "instances"); });
     }
     ns->Withdraw(*this);
 }

@@ -11,6 +11,7 @@
 #include "embedded/store/InMemClassChecks.h"
 #include "embedded/store/TInMemClass.h"
 #include "embedded/store/TInMemNamespace.h"
+#include "embedded/store/TStoreRefusal.h"
 #include "embedded/value/TNameText.h"
 #include "host/TZELException.h"
 
@@ -63,7 +64,7 @@ boost::shared_ptr<ICIMPropertyDecl> TInMemClass::AllocatePropertyDecl(const std:
 {
     RequireName(name);
     if (value.GetType() == TCIMValue::TCIMType::kNone) {
-        throw TZELException(TZELStatusCode::kTypeMismatch);
+        throw TStoreRefusal(TZELStatusCode::kTypeMismatch, [&] { return "property " + name + " has no type"; });
     }
     return boost::make_shared<TInMemPropertyDecl>(name, value);
 }

@@ -18,7 +18,7 @@
 #include "embedded/store/TInMemExtent.h"
 #include "embedded/store/TInMemNamespace.h"
 #include "embedded/store/TPlacedAllocator.h"
-#include "host/TZELException.h"
+#include "embedded/store/TStoreRefusal.h"
 
 namespace NORVZEL20 {
 
@@ -144,7 +144,8 @@ boost::shared_ptr<ICIMProperty> TInMemInstance::GetProperty(const std::string& n
 {
     const std::uint32_t slot = fClass->GetLayout().FindSlot(name);
     if (slot == TInMemLayout::kNoSlot) {
-        throw TZELException(TZELStatusCode::kNotFound);
+        throw TStoreRefusal(TZELStatusCode::kNotFound,
+                            [&] { return "property " + name + " of instance " + TStoreRefusal::Shown(GetReference()); });
     }
     return GetHandle(slot, shared_from_this());
 }

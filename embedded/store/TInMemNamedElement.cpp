@@ -3,6 +3,7 @@
 #include <boost/smart_ptr/make_shared.hpp>
 
 #include "embedded/store/TInMemQualifier.h"
+#include "embedded/store/TStoreRefusal.h"
 #include "host/TZELException.h"
 
 namespace NORVZEL20 {
@@ -38,7 +39,9 @@ TInMemNamedElement<TInterface>::AllocateQualifier(boost::shared_ptr<const ICIMQu
     // A null takes the declared type; any other value must have it.
     const TCIMValue::TCIMType type = decl->GetValue(context).GetType();
     if (!value.IsNull() && value.GetType() != type) {
-        throw TZELException(TZELStatusCode::kTypeMismatch);
+        throw TStoreRefusal(TZELStatusCode::kTypeMismatch, [&] {
+            return "qualifier " + decl->GetName(context) + TStoreRefusal::OfOtherType(type, value.GetType());
+        });
     }
     return boost::make_shared<TInMemQualifier>(decl->GetName(context), value.IsNull() ? TCIMValue::Null(type) : value, flavor);
 }

@@ -124,13 +124,17 @@ void TInMemNamespace::CheckDeclarable(const TInMemClass& cls) const
         return;
     }
     if (!superClass->IsDeclared()) {
-        throw TZELException(TZELStatusCode::kNotFound);
+        throw TStoreRefusal(TZELStatusCode::kNotFound,
+                            [&] { return "superclass " + superClass->GetName() + " of class " + cls.GetName(); });
     }
     // The superclass may have got one of these properties after the class was allocated.
     for (const auto& own : cls.GetLayout().GetOwnDecls()) {
         const auto inherited = superClass->FindPropertyDecl(own->GetName());
         if (inherited && inherited->GetType() != own->GetType()) {
-            throw TZELException(TZELStatusCode::kTypeMismatch);
+            throw TStoreRefusal(TZELStatusCode::kTypeMismatch, [&] {
+                return "property " + own->GetName() + " of class " + superClass->GetName() +
+                       TStoreRefusal::OfOtherType(inherited->GetType(), own->GetType()) + " as in class " + cls.GetName();
+            });
         }
     }
 }

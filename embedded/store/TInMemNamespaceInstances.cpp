@@ -79,7 +79,7 @@ void TInMemNamespace::ModifyInstance(const TCIMReference& path, TCallContext pro
                 return "property " + wanted + " of instance " + TStoreRefusal::Shown(path);
             });
         }
-        TCIMValue fitting = layout.GetDecl(slot).Fit(value);
+        TCIMValue fitting = layout.GetDecl(slot).Fit(value, instance.get());
         // A key may be named, but only with the value that it has.
         if (!layout.GetDecl(slot).IsKey()) {
             changes.emplace_back(slot, std::move(fitting));

@@ -47,7 +47,8 @@ void TInMemProperty::MarkStandIn(TCIMValue value)
 
 TCIMValue TInMemProperty::Fit(TCIMValue&& value) const
 {
-    return GetInstance().GetInMemClass()->GetLayout().GetDecl(fSlot).Fit(std::move(value));
+    const TInMemInstance& instance = GetInstance();
+    return instance.GetInMemClass()->GetLayout().GetDecl(fSlot).Fit(std::move(value), &instance);
 }
 
 /// Everything that may fail comes first: the caller has checked the new value, and the old one is kept if it will be asked for.

@@ -12,6 +12,8 @@
 
 #include "embedded/store/InMemClassChecks.h"
 #include "embedded/store/TInMemClass.h"
+#include "embedded/store/TInMemInstance.h"
+#include "embedded/store/TStoreRefusal.h"
 #include "embedded/value/TNameText.h"
 #include "host/TCIMReference.h"
 #include "host/TZELException.h"
@@ -56,13 +58,27 @@ bool TInMemPropertyDecl::HoldsObjects() const
     return GetQualifiers().IsTrue("EmbeddedObject") || GetQualifiers().Find("EmbeddedInstance");
 }
 
-TCIMValue TInMemPropertyDecl::Fit(TCIMValue value) const
+void TInMemPropertyDecl::RefuseType(TCIMValue::TCIMType type, const TInMemInstance* holder) const
+{
+    throw TStoreRefusal(TZELStatusCode::kTypeMismatch, [&] {
+        const auto owner = GetOwner();
+        std::string of;
+        if (holder != nullptr) {
+            of = " of instance " + TStoreRefusal::Shown(holder->GetReference());
+        } else if (owner) {
+            of = " of class " + owner->GetName();
+        }
+        return "property " + fName + of + TStoreRefusal::OfOtherType(GetType(), type);
+    });
+}
+
+TCIMValue TInMemPropertyDecl::Fit(TCIMValue value, const TInMemInstance* holder) const
 {
     if (value.IsNull()) {
         return TCIMValue::Null(GetType());
     }
     if (value.GetType() != GetType()) {
-        throw TZELException(TZELStatusCode::kTypeMismatch);
+        RefuseType(value.GetType(), holder);
     }
     if (fBag) {
         return value.AsBag();

@@ -12,6 +12,7 @@
 namespace NORVZEL20 {
 
 class TInMemClass;
+class TInMemInstance;
 
 /// A property's declaration in an in-memory class.
 ///
@@ -48,8 +49,9 @@ class CIMDELTA_EXPORT TInMemPropertyDecl : public TInMemNamedElement<ICIMPropert
     /// Whether text in it may be an embedded object: a string with EmbeddedObject(true) or EmbeddedInstance. Cost: looks for both.
     bool HoldsObjects() const;
 
-    /// The value as the property holds it: nulls typed, bags marked. Errors: kTypeMismatch (13) if the types differ.
-    TCIMValue Fit(TCIMValue value) const;
+    /// The value as the property holds it: nulls typed, bags marked. Errors: kTypeMismatch (13) if the types differ; the
+    /// TStoreRefusal names the property and `holder`, whose property it is, or for null the declaring class.
+    TCIMValue Fit(TCIMValue value, const TInMemInstance* holder = nullptr) const;
 
     /// The value with a stub in the place of each class that a reference in it holds. A class owns its declarations; if a value in
     /// one of them owned the class, neither would ever be released.
@@ -80,6 +82,7 @@ class CIMDELTA_EXPORT TInMemPropertyDecl : public TInMemNamedElement<ICIMPropert
     void UpdateMarks();
     void MarkStaticValue();
     bool IsBagDeclared() const;
+    [[noreturn]] void RefuseType(TCIMValue::TCIMType type, const TInMemInstance* holder) const;
 
     std::string fName;
     std::string fReferenceClass;

@@ -2,6 +2,7 @@
 
 #include <boost/smart_ptr/make_shared.hpp>
 
+#include "embedded/value/TValueText.h"
 #include "host/TCIMReference.h"
 
 namespace NORVZEL20 {
@@ -38,6 +39,11 @@ std::string TStoreRefusal::Shown(TCIMReference path)
         --end;
     }
     return text.substr(0, end) + "...";
+}
+
+std::string TStoreRefusal::OfOtherType(TCIMValue::TCIMType type, TCIMValue::TCIMType refused)
+{
+    return " is " + TValueText::DescribeType(type) + ", not " + TValueText::DescribeType(refused);
 }
 
 }  // namespace NORVZEL20

@@ -4,6 +4,7 @@
 #include <string>
 
 #include "host/Export.h"
+#include "host/TCIMValue.h"
 #include "host/TZELException.h"
 
 namespace NORVZEL20 {
@@ -35,6 +36,9 @@ class CIMDELTA_EXPORT TStoreRefusal : public TZELException {
 
     /// The path within its namespace as it was written (TCIMReference::ToText), cut off after 200 bytes.
     static std::string Shown(TCIMReference path);
+
+    /// " is uint64, not string": what an element is, and what the refused one would have been.
+    static std::string OfOtherType(TCIMValue::TCIMType type, TCIMValue::TCIMType refused);
 
   private:
     boost::shared_ptr<const std::string> Compose(const std::string& refused) const;

@@ -155,6 +155,10 @@ TEST(CopyingTest, WhatTheStoreRefusesReachesTheCallerWithItsText)
     EXPECT_EQ("Already exists: instance Disk.Id=\"sda\"", RefusalOf({id, bay}, {id, keyBay}, {TCIMValue(1u), TCIMValue(2u)}));
     EXPECT_EQ("Key without a value: key Bay of instance Disk.Bay=NULL,Id=\"sda\"",
               RefusalOf({id, keyBay}, {id, bay}, {TCIMValue::Null(TCIMValue::TCIMType::kUint32)}));
+    EXPECT_EQ("Type mismatch: property Bay of instance Disk.Id=\"sda\" is string, not uint32",
+              RefusalOf({id, TNamespaceBuilder::Property("Bay", TCIMValue::TCIMType::kString)}, {id, bay}, {TCIMValue(1u)}));
+    EXPECT_EQ("Not found: property Bay of instance Disk.Id=\"sda\"", RefusalOf({id}, {id, bay}, {TCIMValue(1u)}));
+    EXPECT_EQ("", RefusalOf({id}, {id, bay}, {TCIMValue::Null(TCIMValue::TCIMType::kUint32)}));
 }
 
 }  // namespace

@@ -15,7 +15,8 @@ TEST_F(SchemaConflictTest, APropertyThatAClassBelowDeclaresOtherwise)
         "cimdelta: b.xml: property Size of class Disk of a.xml cannot be declared here: class FastDisk below it has one of that "
         "name with the type string instead of uint32; give them one type in both inventories, or another name\n",
         Compare(above, below));
-    EXPECT_EQ("cimdelta: b.xml: class FastDisk of a.xml cannot be declared here: Type mismatch; a superclass has a property of "
+    EXPECT_EQ("cimdelta: b.xml: class FastDisk of a.xml cannot be declared here: Type mismatch: property Size of class FastDisk is "
+              "uint32, not string; a superclass has a property of "
               "another type in the two inventories\n",
               Compare(below, above));
 }

@@ -1,3 +1,4 @@
+#include <functional>
 #include <new>
 #include <type_traits>
 
@@ -40,6 +41,17 @@ class StoreRefusalTest : public TInMemFixture {
             call();
         } catch (const TStoreRefusal& refusal) {
             return refusal.what();
+        }
+        return "";
+    }
+
+    /// The text of any exception of the host that the call throws.
+    static std::string TextOf(const std::function<void()>& call)
+    {
+        try {
+            call();
+        } catch (const TZELException& failure) {
+            return failure.what();
         }
         return "";
     }
@@ -110,6 +122,92 @@ TEST_F(StoreRefusalTest, ADeclarationThatIsThereIsNamed)
     EXPECT_EQ("Already exists: class DISK", RefusalOf([&] { Declare("DISK", nullptr); }));
     EXPECT_EQ("", RefusalOf(declare));
     EXPECT_EQ("Already exists: qualifier Alias", RefusalOf(declare));
+}
+
+TEST_F(StoreRefusalTest, AValueOfAnotherTypeIsRefusedByInstanceAndProperty)
+{
+    const std::string refusal = "Type mismatch: property Size of instance Disk.Bay=1,Id=\"sda\" is uint64, not string";
+    const auto size = fStored->GetProperty("Size", kNoContext);
+    EXPECT_EQ(refusal, RefusalOf([&] { size->SetValue(TCIMValue("big"), kNoContext); }));
+    EXPECT_EQ(refusal, RefusalOf([&] { size->MarkChanged(TCIMValue("big")); }));
+    EXPECT_EQ(refusal, RefusalOf([&] {
+                  fNamespace->ModifyInstance(fStored->GetReference(), {{"size", TCIMValue("big")}}, kNoContext);
+              }));
+    EXPECT_EQ("Not found: property Weight of instance Disk.Bay=1,Id=\"sda\"",
+              RefusalOf([&] { fStored->GetProperty("Weight", kNoContext); }));
+}
+
+TEST_F(StoreRefusalTest, AStaticValueOfAnotherTypeIsRefusedByClassAndProperty)
+{
+    const TClassPointer fan = Declare("Fan", fDisk, {{"Count", TType::kUint8, {"Static"}}});
+    const std::string refusal = "Type mismatch: property Count of class Fan is uint8, not string[]";
+    const TCIMValue texts(TType::kArrayString, 0, {});
+    EXPECT_EQ(refusal, RefusalOf([&] { fan->SetPropertyValue("Count", texts, kNoContext); }));
+    EXPECT_EQ(refusal, RefusalOf([&] { Allocate(fan, {})->GetProperty("Count", kNoContext)->MarkChanged(texts); }));
+    EXPECT_EQ("Type mismatch: property Free is uint8, not string[]",
+              RefusalOf([&] { TInMemPropertyDecl("Free", TCIMValue::Null(TType::kUint8)).Fit(texts); }));
+}
+
+TEST_F(StoreRefusalTest, ADeclarationOfAnotherTypeIsRefusedByClassAndMember)
+{
+    const TClassPointer fast = Declare("FastDisk", fDisk, {{"Speed", TType::kUint8, {}}});
+    fDisk->AddMethodDecl(fDisk->AllocateMethodDecl("Spin", TType::kUint32, kNoContext));
+    EXPECT_EQ("Type mismatch: property Size of class FastDisk is uint64, not string", RefusalOf([&] {
+                  fast->AddPropertyDecl(Decl({"Size", TType::kString, {}}));
+              }));
+    EXPECT_EQ("Type mismatch: property Speed of class FastDisk is uint8, not string", RefusalOf([&] {
+                  fDisk->AddPropertyDecl(Decl({"SPEED", TType::kString, {}}));
+              }));
+    EXPECT_EQ("Type mismatch: property Weight has no type",
+              RefusalOf([&] { fDisk->AllocatePropertyDecl("Weight", TCIMValue(), kNoContext); }));
+
+    const TClassPointer other = Allocate("Other", nullptr, {{"Size", TType::kString, {}}});
+    EXPECT_EQ("Type mismatch: property Size of class Disk is uint64, not string",
+              RefusalOf([&] { fDisk->ModifyClass(other, kNoContext); }));
+    const TClassPointer spinning = Allocate("Spinning", nullptr, {});
+    spinning->AddMethodDecl(spinning->AllocateMethodDecl("spin", TType::kString, kNoContext));
+    EXPECT_EQ("Type mismatch: method Spin of class Disk is uint32, not string",
+              RefusalOf([&] { fDisk->ModifyClass(spinning, kNoContext); }));
+
+    const auto alias = fNamespace->AllocateQualifierDecl("Alias", TCIMValue(false), ICIMQualifierDecl::kScopeProperty,
+                                                         ICIMQualifierDecl::kFlavorDefault, kNoContext);
+    EXPECT_EQ("Type mismatch: qualifier Alias is boolean, not string",
+              RefusalOf([&] { fDisk->AllocateQualifier(alias, TCIMValue("disc"), kNoContext); }));
+}
+
+TEST_F(StoreRefusalTest, AClassThatCannotBeDeclaredIsNamed)
+{
+    const TClassPointer device = Allocate("Device", nullptr, {});
+    const TClassPointer part = Allocate("Part", device, {{"Size", TType::kString, {}}});
+    EXPECT_EQ("Not found: superclass Device of class Part", RefusalOf([&] { part->Validate(kNoContext); }));
+    EXPECT_EQ("Not found: class Part", RefusalOf([&] { Allocate(part, {})->AddToNamespace(kNoContext); }));
+    device->AddToNamespace(kNoContext);
+    device->AddPropertyDecl(Decl({"Size", TType::kUint64, {}}));
+    EXPECT_EQ("Type mismatch: property Size of class Device is uint64, not string as in class Part",
+              RefusalOf([&] { part->AddToNamespace(kNoContext); }));
+}
+
+TEST_F(StoreRefusalTest, WhatIsInUseIsNamed)
+{
+    const TClassPointer fast = Declare("FastDisk", fDisk);
+    Allocate(fast, {{"Id", TCIMValue("sdb")}, {"Bay", TCIMValue(static_cast<unsigned char>(1))}})->AddToNamespace(kNoContext);
+    EXPECT_EQ("Class in use: class Disk has subclasses", RefusalOf([&] { fDisk->RemoveFromNamespace(kNoContext); }));
+    EXPECT_EQ("Class in use: class FastDisk has instances", RefusalOf([&] { fast->RemoveFromNamespace(kNoContext); }));
+    EXPECT_EQ("Class in use: key Id of class Disk, which has instances",
+              RefusalOf([&] { fDisk->RemovePropertyDecl(fDisk->GetPropertyDecl("id", kNoContext)); }));
+}
+
+/// The caller has the names, and hosts agree on the text: the plug-in writes it to the log.
+TEST_F(StoreRefusalTest, ALookUpByNameReportsTheStatusAlone)
+{
+    const std::function<void()> lookUps[] = {
+        [&] { fNamespace->GetClass("Fan", kNoContext); },  [&] { fDisk->GetPropertyDecl("Weight", kNoContext); },
+        [&] { fDisk->GetMethodDecl("Spin", kNoContext); }, [&] { fDisk->GetProperty("Size", kNoContext); },
+        [&] { fDisk->GetQualifier("Alias", kNoContext); }, [&] { fNamespace->GetQualifierDecl("Alias", kNoContext); },
+    };
+    for (const auto& lookUp : lookUps) {
+        EXPECT_EQ("Not found", TextOf(lookUp));
+    }
 }
 
 TEST_F(StoreRefusalTest, ALongPathIsCutOffBetweenCharacters)
