@@ -285,14 +285,16 @@ TCIMReference TCIMReference::Parse(const std::string& text, boost::shared_ptr<IC
     if (!cls) {
         path.SetClassName(className);
     }
-    // The bindings are sorted and have no duplicates, so each is added at the end.
-    path.fContents->bindings.reserve(reader.GetBindings().size());
+    // The bindings are sorted and have no duplicates, so each is moved to the end instead of being searched for its place.
+    TContents& contents = path.Own();
+    contents.bindings.reserve(reader.GetBindings().size());
     for (TPathReader::TBinding& binding : reader.GetBindings()) {
         if (cls) {
             Adapt(binding, *cls, ns);
         }
         TValueAccess::LimitDepth(binding.value, 0);  // text in quotes may hold paths that nest too deeply
-        path.AddKeyValue(binding.name, binding.value);
+        contents.depth = std::max(contents.depth, TContents::GetDepth(binding.value));
+        contents.bindings.emplace_back(std::move(binding.name), std::move(binding.value));
     }
     return path;
 }

@@ -101,5 +101,17 @@ TEST_F(InMemMemoryTest, AnInstanceIsOneAllocation)
     EXPECT_EQ(before + 1, CountedAllocations());
 }
 
+/// Names of up to 15 bytes take no allocation of their own; a longer one is read into one, which the path takes over.
+TEST_F(InMemMemoryTest, ReadingAPathAllocatesEachNameOnce)
+{
+    const auto allocationsOf = [](const std::string& text) {
+        const std::size_t before = CountedAllocations();
+        const TCIMReference path = TCIMReference::Parse(text);
+        EXPECT_EQ(2u, path.GetKeyCount());
+        return CountedAllocations() - before;
+    };
+    EXPECT_EQ(allocationsOf("Disk.A=1,B=2") + 2, allocationsOf("Disk.CreationClassName=1,SystemCreationClassName=2"));
+}
+
 }  // namespace
 }  // namespace NORVZEL20
