@@ -7,8 +7,7 @@
 //   adding       with two inventories, an instance that only the other one has is recorded and then added to the reference. If that
 //                failed, the last record is the instance's.
 //   comparing    a pair of instances cannot be compared if a property is missing in the other inventory, if it is a reference in
-//   the
-//                reference alone, or if the reference (with two inventories) cannot take over a value of another type.
+//                the reference alone, or if the reference (with two inventories) cannot take over a value of another type.
 //   matching     an instance cannot be matched if the plug-in cannot make its key.
 #include "client/comparison/TFaultSearch.h"
 

@@ -4,8 +4,7 @@
 //    the document ends. All instances after it wait too; otherwise they would overtake it, and the namespace would not keep the
 //    document's order.
 // 2. The class is known, but a reference is to a class that is not, or whether it stays in the document's own namespace is open.
-// How
-//    a reference is written depends on both, so it is noted and written again at the end. The instance is added meanwhile.
+//    How a reference is written depends on both, so it is noted and written again at the end. The instance is added meanwhile.
 // 3. As 2, but the reference is a key. Then the name of the instance itself may change, so the instance is held: filled, but added
 //    only after its references have been written again. Later instances of its class are held too, for the order.
 #include "embedded/cimxml/TCimXmlLateInstances.h"

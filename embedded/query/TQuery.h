@@ -29,8 +29,7 @@ struct TQueryCondition;
 /// - The answer has whole instances of the class and its subclasses, even if the query lists properties. Those must be declared.
 /// - A test with a NULL is neither true nor false, and so is its NOT. Only IS NULL finds NULLs.
 /// - Text compares byte for byte, numbers by value even if their types differ, references by path text, datetimes as instants. A
-/// test
-///   with asterisks in a datetime is neither true nor false. Arrays can only be tested for NULL.
+///   test with asterisks in a datetime is neither true nor false. Arrays can only be tested for NULL.
 /// - ISA tests the class of a reference or an embedded object. With the name of the query's class on the left it tests the class of
 ///   the instance itself.
 ///
