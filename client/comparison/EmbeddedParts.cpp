@@ -13,6 +13,7 @@
 #include <algorithm>
 #include <functional>
 #include <set>
+#include <utility>
 
 #include "embedded/value/TEmbeddedObject.h"
 #include "embedded/value/TNameText.h"
@@ -79,7 +80,7 @@ TCIMValue ValueIn(const TEmbeddedObject& object, const std::string& name, const 
 void AddToGroup(TValueDifference::TGroup& group, const TValueDifference::TGroup& holders)
 {
     for (std::size_t i = 0; i < holders.inventories.size(); ++i) {
-        group.Add(holders.inventories[i], holders.instances[i]);
+        group.Add(holders.inventories[i], holders.CountInstances(i));
     }
 }
 
@@ -138,7 +139,7 @@ void AddEmbeddedParts(TValueDifference& difference, bool hasReference)
         TValueDifference part = PartOf(difference, name, objects, hasReference);
         if (!part.others.empty()) {
             AddEmbeddedParts(part, hasReference);
-            difference.parts.push_back(part);
+            difference.parts.push_back(std::move(part));
         }
     }
 }

@@ -20,18 +20,17 @@ struct TDifference {
     };
 
     EKind kind;
+    bool hasKeys = true;  ///< whether the class has keys; otherwise it has one instance at most
     std::string className;
     std::string instance;                                 ///< the key by which instances were matched, as path text
     std::vector<std::pair<std::string, TCIMValue>> keys;  ///< the same, key by key, in the class's order
-    bool hasKeys = true;                                  ///< whether the class has keys; otherwise it has one instance at most
     std::string path;                      ///< only of kOnlyInReference, if the rules of the class exclude keys: the whole path
-    std::string property;                  ///< only of kChanged
     std::vector<std::size_t> inventories;  ///< the positions of those that differ, ascending, each once
     /// For each inventory of the run, how many instances have the key. Only the reference and `inventories` are counted. Empty if
     /// the rules exclude no key, so no two instances share one.
     std::vector<std::size_t> sharing;
-    /// Of kChanged: the property. Of kOnlyInOthers: each compared property in which the instances of `inventories` differ from one
-    /// another, ascending by name.
+    /// Of kChanged: the property, and nothing else. Of kOnlyInOthers: each compared property in which the instances of
+    /// `inventories` differ from one another, ascending by name.
     std::vector<TValueDifference> values;
 
     /// The instance's key without the class: `Key1="v",Key2=5`; empty if the class has no keys or the rules exclude all of them.

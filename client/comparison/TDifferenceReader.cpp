@@ -16,7 +16,9 @@
 #include "client/comparison/TDifferenceReader.h"
 
 #include <algorithm>
+#include <map>
 #include <tuple>
+#include <utility>
 
 #include "client/comparison/EmbeddedParts.h"
 #include "client/comparison/ReadDeltaRecords.h"
@@ -55,7 +57,7 @@ TCIMValue ValueIfDeclared(const ICIMInstance& instance, const std::string& prope
     return FindPropertyDecl(*cls, property) ? ValueBefore(instance, property) : TCIMValue::Null(declared);
 }
 
-// The value as a property declared like this would hold it: an array is a bag if the declaration makes it one, else it is not.
+// The array as a property declared like this would hold it: it is a bag if the declaration makes it one, else it is not.
 TCIMValue InFormOf(const TInMemPropertyDecl& declared, const TCIMValue& value)
 {
     if (declared.IsBag()) {
@@ -67,17 +69,27 @@ TCIMValue InFormOf(const TInMemPropertyDecl& declared, const TCIMValue& value)
 
 bool StandsBefore(const TDifference& a, const TDifference& b)
 {
-    return std::tie(a.className, a.instance, a.kind, a.property) < std::tie(b.className, b.instance, b.kind, b.property);
+    if (a.kind != TDifference::kChanged || b.kind != TDifference::kChanged) {
+        return std::tie(a.className, a.instance, a.kind) < std::tie(b.className, b.instance, b.kind);
+    }
+    return std::tie(a.className, a.instance, a.values.front().property) <
+           std::tie(b.className, b.instance, b.values.front().property);
 }
 
 }  // namespace
 
 std::vector<TDifference> TDifferenceReader::Read(TDeltaNamespace& records)
 {
+    std::map<std::string, std::vector<TDeltaRecord>> classes = ReadDeltaRecords(records);
+    std::size_t count = 0;
+    for (const auto& ofClass : classes) {
+        count += ofClass.second.size();
+    }
     std::vector<TDifference> differences;
-    for (const auto& ofClass : ReadDeltaRecords(records)) {
+    differences.reserve(count);
+    for (auto& ofClass : classes) {
         StartClass(ofClass.first);
-        for (const TDeltaRecord& record : ofClass.second) {
+        for (TDeltaRecord& record : ofClass.second) {
             differences.push_back(Make(record));
         }
     }
@@ -96,33 +108,34 @@ void TDifferenceReader::StartClass(const std::string& className)
     std::sort(fProperties.begin(), fProperties.end());
     fExcludesKeys = !fRules.ExcludedKeysOf(className).empty();
     fHasKeys = !KeyNamesOf(*fClass).empty();
+    fKeysOf.reset();
 }
 
-TDifference TDifferenceReader::Make(const TDeltaRecord& record)
+// Moves the record's parts into the difference.
+TDifference TDifferenceReader::Make(TDeltaRecord& record)
 {
     TDifference difference;
     difference.className = fClassName;
-    difference.instance = record.instanceName;
-    difference.property = record.property;
-    difference.inventories = record.inventories;
+    difference.instance = std::move(record.instanceName);
+    difference.inventories = std::move(record.inventories);
     difference.hasKeys = fHasKeys;
     boost::shared_ptr<ICIMInstance> instance;
     switch (record.type) {
     case TDeltaNamespace::kInstanceRemoved:
         difference.kind = TDifference::kOnlyInReference;
-        instance = FindByPath(record.instanceName);
+        instance = FindByPath(difference.instance);
+        difference.path = fExcludesKeys ? std::move(difference.instance) : std::string();
         difference.instance = fRules.KeyOf(fClassName, instance);
-        difference.path = fExcludesKeys ? record.instanceName : std::string();
         break;
     case TDeltaNamespace::kInstanceAdded:
         difference.kind = TDifference::kOnlyInOthers;
-        instance = Index(difference.inventories.front()).Find(record.instanceName).at(0);
+        instance = Index(difference.inventories.front()).Find(difference.instance).at(0);
         AddDisagreements(difference);
         break;
     case TDeltaNamespace::kPropertyChanged:
         difference.kind = TDifference::kChanged;
-        instance = Index(0).Find(record.instanceName).at(0);
-        AddChange(difference, *instance);
+        instance = Index(0).Find(difference.instance).at(0);
+        AddChange(difference, std::move(record.property), *instance);
         break;
     }
     AddKeys(difference, *instance);
@@ -154,34 +167,40 @@ const TInstanceIndex& TDifferenceReader::Index(std::size_t inventory)
 }
 
 // The keys are those of the instance's own class: with --strict-schema, another inventory may declare others than the reference.
-void TDifferenceReader::AddKeys(TDifference& difference, const ICIMInstance& instance) const
+void TDifferenceReader::AddKeys(TDifference& difference, const ICIMInstance& instance)
 {
-    const std::vector<std::string>& excluded = fRules.ExcludedKeysOf(fClassName);
-    for (const std::string& name : KeyNamesOf(*instance.GetClass(TCallContext()))) {
-        if (std::find(excluded.begin(), excluded.end(), name) == excluded.end()) {
-            difference.keys.push_back({name, ValueBefore(instance, name)});
-        }
+    const boost::shared_ptr<ICIMClass> cls = instance.GetClass(TCallContext());
+    if (cls != fKeysOf) {
+        fKeysOf = cls;
+        fKeys = KeyNamesOf(*cls);
+        fKeys.erase(std::remove_if(fKeys.begin(), fKeys.end(),
+                                   [this](const std::string& name) { return fRules.ExcludesKey(fClassName, name); }),
+                    fKeys.end());
+    }
+    difference.keys.reserve(fKeys.size());
+    for (const std::string& name : fKeys) {
+        difference.keys.push_back({name, ValueBefore(instance, name)});
     }
 }
 
 // If instances of an inventory share the key, only some of them may differ from the reference.
-void TDifferenceReader::AddChange(TDifference& difference, const ICIMInstance& reference)
+void TDifferenceReader::AddChange(TDifference& difference, std::string&& property, const ICIMInstance& reference)
 {
-    TValueDifference change;
-    change.property = difference.property;
-    change.reference = ValueBefore(reference, difference.property);
-    const TValueDifference::TEqual areEqual = MakeEqual(*fClass->FindPropertyDecl(change.property));
+    difference.values.resize(1);
+    TValueDifference& change = difference.values.front();
+    change.property = std::move(property);
+    change.reference = ValueBefore(reference, change.property);
+    const TValueDifference::TEqual areEqual = MakeEqual(change.property);
     for (const std::size_t inventory : difference.inventories) {
         const TInstanceIndex::TInstances& instances = Index(inventory).Find(difference.instance);
         for (const boost::shared_ptr<ICIMInstance>& instance : instances) {
-            const TCIMValue value = ValueBefore(*instance, difference.property);
+            const TCIMValue value = ValueBefore(*instance, change.property);
             if (instances.size() == 1 || fRules.Differ(fClassName, change.reference, value)) {
                 change.GetGroup(value, areEqual).Add(inventory, 1);
             }
         }
     }
     AddEmbeddedParts(change, true);
-    difference.values.push_back(change);
 }
 
 void TDifferenceReader::AddDisagreements(TDifference& difference)
@@ -195,22 +214,25 @@ void TDifferenceReader::AddDisagreements(TDifference& difference)
     for (std::size_t i = 0; instances.size() > 1 && i < fProperties.size(); ++i) {
         TValueDifference values;
         values.property = fProperties[i];
-        const TInMemPropertyDecl& declared = *fClass->FindPropertyDecl(values.property);
-        const TValueDifference::TEqual areEqual = MakeEqual(declared);
+        const TCIMValue::TCIMType declared = fClass->FindPropertyDecl(values.property)->GetType();
+        const TValueDifference::TEqual areEqual = MakeEqual(values.property);
         for (const auto& [inventory, instance] : instances) {
-            values.GetGroup(ValueIfDeclared(*instance, values.property, declared.GetType()), areEqual).Add(inventory, 1);
+            values.GetGroup(ValueIfDeclared(*instance, values.property, declared), areEqual).Add(inventory, 1);
         }
         if (values.DoOthersDiffer(areEqual)) {
             AddEmbeddedParts(values, false);
-            difference.values.push_back(values);
+            difference.values.push_back(std::move(values));
         }
     }
 }
 
-TValueDifference::TEqual TDifferenceReader::MakeEqual(const TInMemPropertyDecl& declared) const
+// The property must outlive the result.
+TValueDifference::TEqual TDifferenceReader::MakeEqual(const std::string& property) const
 {
-    return [this, &declared](const TCIMValue& one, const TCIMValue& other) {
-        return !fRules.Differ(fClassName, InFormOf(declared, one), other);
+    return [this, &property](const TCIMValue& one, const TCIMValue& other) {
+        return one.GetType().IsArray() && !one.IsNull()
+                   ? !fRules.Differ(fClassName, InFormOf(*fClass->FindPropertyDecl(property), one), other)
+                   : !fRules.Differ(fClassName, one, other);
     };
 }
 

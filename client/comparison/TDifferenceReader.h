@@ -25,13 +25,13 @@ class TDifferenceReader {
 
   private:
     void StartClass(const std::string& className);
-    TDifference Make(const TDeltaRecord& record);
+    TDifference Make(TDeltaRecord& record);
     boost::shared_ptr<ICIMInstance> FindByPath(const std::string& path);
     const TInstanceIndex& Index(std::size_t inventory);
-    void AddKeys(TDifference& difference, const ICIMInstance& instance) const;
-    void AddChange(TDifference& difference, const ICIMInstance& reference);
+    void AddKeys(TDifference& difference, const ICIMInstance& instance);
+    void AddChange(TDifference& difference, std::string&& property, const ICIMInstance& reference);
     void AddDisagreements(TDifference& difference);
-    TValueDifference::TEqual MakeEqual(const TInMemPropertyDecl& declared) const;
+    TValueDifference::TEqual MakeEqual(const std::string& property) const;
     void CountSharing(TDifference& difference);
 
     const std::vector<TInventory>& fInventories;
@@ -41,6 +41,8 @@ class TDifferenceReader {
     bool fHasKeys = true;                                                      // of the class being read
     bool fExcludesKeys = false;                                                // likewise
     std::vector<std::string> fProperties;                                      // likewise; those compared, ascending
+    boost::shared_ptr<ICIMClass> fKeysOf;                                      // the class of the instance read last
+    std::vector<std::string> fKeys;                                            // its keys that are not excluded
     std::vector<std::unique_ptr<TInstanceIndex>> fIndexes;                     // of the class being read, made when first needed
     std::unordered_map<std::string, boost::shared_ptr<ICIMInstance>> fByPath;  // the reference's instances, likewise
 };

@@ -9,11 +9,15 @@ void TValueDifference::TGroup::Add(std::size_t inventory, std::size_t count)
     const auto found = std::lower_bound(inventories.begin(), inventories.end(), inventory);
     const auto at = found - inventories.begin();
     if (found != inventories.end() && *found == inventory) {
+        instances.resize(inventories.size(), 1);
         instances[static_cast<std::size_t>(at)] += count;
         return;
     }
+    if (count != 1 || !instances.empty()) {
+        instances.resize(inventories.size(), 1);
+        instances.insert(instances.begin() + at, count);
+    }
     inventories.insert(found, inventory);
-    instances.insert(instances.begin() + at, count);
 }
 
 TValueDifference::TGroup& TValueDifference::GetGroup(const TCIMValue& value, const TEqual& areEqual)
@@ -24,7 +28,7 @@ TValueDifference::TGroup& TValueDifference::GetGroup(const TCIMValue& value, con
     if (found != others.end()) {
         return *found;
     }
-    others.push_back({{}, {}, value});
+    others.push_back({{}, value, {}});
     return others.back();
 }
 

@@ -14,11 +14,16 @@ struct TValueDifference {
     /// One value and the inventories that have it.
     struct TGroup {
         std::vector<std::size_t> inventories;  ///< ascending
-        std::vector<std::size_t> instances;    ///< for each of `inventories`, how many of its instances have the value
         TCIMValue value;                       ///< of the first of them; the others' are of its type and equal under the rules
 
         /// Notes `count` more instances of `inventory`.
         void Add(std::size_t inventory, std::size_t count);
+        /// How many instances of the inventory at `position` of `inventories` have the value.
+        std::size_t CountInstances(std::size_t position) const { return instances.empty() ? 1 : instances[position]; }
+
+        /// The same counts; empty if all are 1. Only inventories in which instances share a key have others, and there are as many
+        /// groups as differences, so memory counts.
+        std::vector<std::size_t> instances;
     };
 
     /// Whether two values are equal.

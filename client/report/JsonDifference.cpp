@@ -147,7 +147,7 @@ class TDifferenceWriter {
         TJson sharing = TJson::array();
         for (std::size_t i = 0; i < group.inventories.size(); ++i) {
             if (fDifference.CountSharing(group.inventories[i]) > 0) {
-                sharing.push_back(Sharing(group.inventories[i], group.instances[i]));
+                sharing.push_back(Sharing(group.inventories[i], group.CountInstances(i)));
             }
         }
         AddList(json, "sharing", std::move(sharing));

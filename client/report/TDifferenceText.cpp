@@ -15,6 +15,7 @@
 #include <boost/algorithm/string/join.hpp>
 
 #include "client/report/DisplayLabels.h"
+#include "client/report/TValueTexts.h"
 #include "client/text/Counted.h"
 #include "client/text/DisplayText.h"
 
@@ -82,23 +83,23 @@ std::string TDifferenceText::Line(const TValueDifference& values) const
 {
     const TValueTexts texts(values, HasReference());
     std::vector<std::string> groups;
-    for (const TValueDifference::TGroup& group : values.others) {
-        groups.push_back(Group(texts, group));
+    for (std::size_t i = 0; i < values.others.size(); ++i) {
+        groups.push_back(Group(values.others[i], texts.GetOther(i)));
     }
     return "    " + EscapeForDisplay(values.property) + ": " +
-           (HasReference() ? texts.Get(values.reference) + kBeforeNewValue : std::string()) +
+           (HasReference() ? texts.GetReference() + kBeforeNewValue : std::string()) +
            boost::algorithm::join(groups, kBetweenValues) + "\n";
 }
 
-std::string TDifferenceText::Group(const TValueTexts& texts, const TValueDifference::TGroup& group) const
+std::string TDifferenceText::Group(const TValueDifference::TGroup& group, const std::string& text) const
 {
     std::vector<std::string> remarks;
     for (std::size_t i = 0; i < group.inventories.size(); ++i) {
         if (fDifference.CountSharing(group.inventories[i]) > 0) {
-            remarks.push_back(ShareRemark(group.inventories[i], group.instances[i]));
+            remarks.push_back(ShareRemark(group.inventories[i], group.CountInstances(i)));
         }
     }
-    return (IsPair() ? std::string() : DisplayLabels(fReport, group.inventories) + ": ") + texts.Get(group.value) +
+    return (IsPair() ? std::string() : DisplayLabels(fReport, group.inventories) + ": ") + text +
            (remarks.empty() ? std::string() : " (" + boost::algorithm::join(remarks, ", ") + ")");
 }
 

@@ -4,7 +4,6 @@
 #include <vector>
 
 #include "client/comparison/TComparisonReport.h"
-#include "client/report/TValueTexts.h"
 
 namespace NORVZEL20 {
 
@@ -24,7 +23,7 @@ class TDifferenceText {
     std::string SharingRemark(std::size_t inventory, const std::string& which) const;
     std::string Lines(const std::vector<TValueDifference>& differences) const;
     std::string Line(const TValueDifference& values) const;
-    std::string Group(const TValueTexts& texts, const TValueDifference::TGroup& group) const;
+    std::string Group(const TValueDifference::TGroup& group, const std::string& text) const;
     std::string ShareRemark(std::size_t inventory, std::size_t count) const;
     bool HasReference() const { return fDifference.kind == TDifference::kChanged; }
     bool IsPair() const { return fReport.labels.size() == 2; }

@@ -1,39 +1,59 @@
 #include "client/report/TValueTexts.h"
 
-#include <set>
+#include <algorithm>
+#include <string_view>
 
 #include "client/text/DisplayText.h"
 #include "client/text/EmbeddedText.h"
-#include "embedded/value/TValueText.h"
 
 namespace NORVZEL20 {
 
-TValueTexts::TValueTexts(const TValueDifference& difference, bool hasReference)
+namespace {
+
+using TValues = std::vector<const TCIMValue*>;
+
+bool HaveTypesThatDiffer(const TValues& values)
 {
-    std::vector<TCIMValue> values;
-    if (hasReference) {
-        values.push_back(difference.reference);
-    }
-    for (const TValueDifference::TGroup& group : difference.others) {
-        values.push_back(group.value);
-    }
-    std::set<std::string> types;
-    std::set<std::string> contents;
-    std::set<std::string> texts;
-    for (const TCIMValue& value : values) {
-        types.insert(TValueText::DescribeType(value.GetType()));
-        if (!value.IsNull()) {
-            contents.insert(DescribeContents(value));
+    const TCIMValue* object = nullptr;
+    const TCIMValue* plain = nullptr;
+    for (const TCIMValue* const value : values) {
+        if (value->GetType() != values.front()->GetType()) {
+            return true;
         }
-        texts.insert(DisplayContents(value));
+        if (!value->IsNull()) {
+            (HasEmbeddedObject(*value) ? object : plain) = value;
+        }
     }
-    fWithTypes = types.size() > 1 || contents.size() > 1;
-    fExact = texts.size() < values.size();
+    return object != nullptr && plain != nullptr;
 }
 
-std::string TValueTexts::Get(const TCIMValue& value) const
+bool LookAlike(const std::vector<std::string>& texts)
 {
-    return (fWithTypes ? DescribeContents(value) + " " : std::string()) + (fExact ? DisplayValue(value) : DisplayContents(value));
+    std::vector<std::string_view> sorted(texts.begin(), texts.end());
+    std::sort(sorted.begin(), sorted.end());
+    return std::adjacent_find(sorted.begin(), sorted.end()) != sorted.end();
+}
+
+}  // namespace
+
+TValueTexts::TValueTexts(const TValueDifference& difference, bool hasReference) : fGroups(difference.others.size())
+{
+    TValues values;
+    if (hasReference) {
+        values.push_back(&difference.reference);
+    }
+    for (const TValueDifference::TGroup& group : difference.others) {
+        values.push_back(&group.value);
+    }
+    for (const TCIMValue* const value : values) {
+        fTexts.push_back(DisplayContents(*value));
+    }
+    const bool isExact = LookAlike(fTexts);
+    const bool isTyped = HaveTypesThatDiffer(values);
+    for (std::size_t i = 0; i < values.size() && (isExact || isTyped); ++i) {
+        fTexts[i] =
+            (isTyped ? DescribeContents(*values[i]) + " " : std::string()) + (isExact ? DisplayValue(*values[i]) : fTexts[i]);
+    }
 }
 
 }  // namespace NORVZEL20

@@ -1,6 +1,8 @@
 #pragma once
 
+#include <cstddef>
 #include <string>
+#include <vector>
 
 #include "client/comparison/TValueDifference.h"
 
@@ -15,12 +17,14 @@ class TValueTexts {
     /// With `hasReference`, the reference's value counts too.
     TValueTexts(const TValueDifference& difference, bool hasReference);
 
-    /// The text of one of the difference's values.
-    std::string Get(const TCIMValue& value) const;
+    /// The text of the reference's value. Only with `hasReference`.
+    const std::string& GetReference() const { return fTexts.front(); }
+    /// The text of the value of the group at `position` of the difference's others.
+    const std::string& GetOther(std::size_t position) const { return fTexts[fTexts.size() - fGroups + position]; }
 
   private:
-    bool fWithTypes = false;
-    bool fExact = false;
+    std::vector<std::string> fTexts;  // the reference's if it counts, then the groups'
+    std::size_t fGroups;
 };
 
 }  // namespace NORVZEL20
