@@ -140,7 +140,7 @@ TEST_F(ExcludedKeysCoverageTest, ReferencesOfInstancesThatShareAKeyCountToo)
 {
     const std::string both =
         NetworkMount("/x", Reference("Dev", ElsewherePath("sda"))) + NetworkMount("/y", Reference("Dev", ElsewherePath("sdb")));
-    EXPECT_EQ("1 difference between a and b: 2 instances only in b\n"
+    EXPECT_EQ("1 difference between a and b: 1 key only in b\n"
               "References of NetworkMount were compared without key Name and without their namespace.\n"
               "Instances of NetworkMount with the key of an earlier one, since the rules leave out Point: 1 of b, reported with "
               "the earlier one, since a has none with that key.\n"
