@@ -89,10 +89,12 @@ class CIMDELTA_EXPORT TCIMReference {
     ///
     /// In quotes any character may have a `\` in front. A number becomes uint64, sint64 (if it has a sign) or real64, text in
     /// double quotes a string. The path gets the class that `ns` declares, and each key of the class its declared spelling and
-    /// type, if the value converts without loss; its text is then that of the instance's own path. If `ns` is null or does not
-    /// declare the class, the path gets a stub. Errors: TZELException with kParseError (9) if the text is no path; `errorPosition`,
-    /// if not null, then gets the byte offset. Also whatever GetClass of `ns` and GetPropertyDecl of the class throw, except
-    /// kNotFound (15): a delta namespace, for example, throws kMissingParameter (38).
+    /// type, if the value converts without loss. Its text is then that of the instance's own path, except that a reference among
+    /// the keys keeps the namespace that it names, and an embedded object stays text; GetInstance finds the instance nevertheless.
+    /// A reference nested too deeply for AddKeyValue stays text. If `ns` is null or does not declare the class, the path gets a
+    /// stub. Errors: TZELException with kParseError (9) if the text is no path; `errorPosition`, if not null, then gets the byte
+    /// offset. Also whatever GetClass of `ns` and GetPropertyDecl of the class throw, except kNotFound (15): a delta namespace, for
+    /// example, throws kMissingParameter (38).
     static TCIMReference Parse(const std::string& text, boost::shared_ptr<ICIMNamespace> ns = boost::shared_ptr<ICIMNamespace>(),
                                std::size_t* errorPosition = nullptr);
 

@@ -14,7 +14,8 @@
 
 namespace NORVZEL20 {
 
-TCimXmlContext::TCimXmlContext(std::string file) : fFile(std::move(file)) {}
+TCimXmlContext::TCimXmlContext(std::string file, std::size_t embeddedDepth) : fFile(std::move(file)), fEmbeddedDepth(embeddedDepth)
+{}
 
 TCimXmlContext::~TCimXmlContext() = default;
 

@@ -42,8 +42,8 @@ class CIMDELTA_INTERNAL_EXPORT TCimXmlContext {
         TPlace fEarlier;
     };
 
-    /// `file` is what messages call the document.
-    explicit TCimXmlContext(std::string file);
+    /// `file` is what messages call the document, `embeddedDepth` how many embedded objects it stands in.
+    explicit TCimXmlContext(std::string file, std::size_t embeddedDepth = 0);
     ~TCimXmlContext();
 
     /// Sets the XML reader that knows the place. Call it before the load begins. The reader must outlive the load.
@@ -73,6 +73,7 @@ class CIMDELTA_INTERNAL_EXPORT TCimXmlContext {
     /// LeaveEmbeddedObject.
     void EnterEmbeddedObject();
     void LeaveEmbeddedObject() noexcept { --fEmbeddedDepth; }
+    std::size_t GetEmbeddedDepth() const noexcept { return fEmbeddedDepth; }
 
     /// Checks a name that may become part of a path. `what` says what it names: "class", "property" or "key". Errors: fails with
     /// kParseError (9) if it has characters other than ASCII letters, digits, underscores and what is beyond ASCII.
@@ -100,7 +101,7 @@ class CIMDELTA_INTERNAL_EXPORT TCimXmlContext {
     TCimXmlOwnPlace fOwnPlace{fReport};
     std::vector<const char*> fKinds;  // of the entries of fReport.tolerated
     TTextPool fTexts;
-    std::size_t fEmbeddedDepth = 0;  // embedded objects that are being read, one inside of the other
+    std::size_t fEmbeddedDepth;  // embedded objects that are being read, one inside of the other
 };
 
 }  // namespace NORVZEL20

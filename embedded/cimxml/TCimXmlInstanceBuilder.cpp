@@ -8,6 +8,7 @@
 
 #include "embedded/cimxml/MessageText.h"
 #include "embedded/store/TReferenceAdapter.h"
+#include "embedded/value/TValueAccess.h"
 #include "embedded/value/TValueText.h"
 
 namespace NORVZEL20 {
@@ -144,10 +145,11 @@ void TCimXmlInstanceBuilder::FillKeys(const TOwnKeys& keys)
         }
         const TInMemPropertyDecl& decl = fLayout->cls->GetLayout().GetDecl(slot);
         TCIMValue converted = value;
-        TValueText::Convert(value, decl.GetType(), converted);  // if that fails, SetProperty reports it
-        Localize(converted);                                    // the name was read before classes in front of it were declared
-        const bool isReference = decl.GetType() == TCIMValue::TCIMType::kReference;  // perhaps to a class that is not known yet
-        SetProperty({&decl.GetName(), slot, decl.GetType(), false}, std::move(converted), isReference);
+        TReferenceAdapter(fNamespace).ConvertKey(decl, value, converted);  // if that fails, SetProperty reports it
+        Localize(converted);  // the name was read before classes in front of it were declared
+        const bool mayRefer =
+            TValueAccess::GetForm(converted) == TValueAccess::kPath || TValueAccess::GetForm(converted) == TValueAccess::kObject;
+        SetProperty({&decl.GetName(), slot, decl.GetType(), false}, std::move(converted), mayRefer);
         fContext.Tolerate("key from name", "an instance of class " + Quote(fLayout->cls->GetName()) + " leaves out its key " +
                                                Quote(name) + "; taken from the name in front of it");
     }

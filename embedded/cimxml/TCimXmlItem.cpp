@@ -2,6 +2,7 @@
 
 #include "embedded/cimxml/MessageText.h"
 #include "embedded/cimxml/TCimXmlObjectReader.h"
+#include "embedded/value/TEmbeddedObject.h"
 #include "embedded/value/TValueText.h"
 
 namespace NORVZEL20 {
@@ -48,7 +49,7 @@ void TCimXmlItem::Parse(std::string_view text, TCIMValue& value)
 bool TCimXmlItem::IsObject(std::string_view text) const
 {
     if (fText == kPerhapsObject) {
-        return TCimXmlObjectReader::LooksLikeObject(text);
+        return TEmbeddedObject::IsPerhapsText(text);
     }
     return fText == kObject && !text.empty();
 }

@@ -15,6 +15,7 @@
 #include <utility>
 
 #include "embedded/cimxml/MessageText.h"
+#include "embedded/cimxml/ReadObjectKey.h"
 
 namespace NORVZEL20 {
 
@@ -23,7 +24,9 @@ using EStatus = TZELStatusCode::EStatusCode;
 TCimXmlLoader::TCimXmlLoader(TCimXmlContext& context, const boost::shared_ptr<TInMemNamespace>& ns)
     : fContext(context), fNamespace(ns), fStaging(ns), fClasses(context, *ns, fStaging),
       fBuilder(context, *ns, fStaging, fClasses, fLate)
-{}
+{
+    ns->SetObjectReader(&ReadObjectKey);
+}
 
 TCimXmlLoader::~TCimXmlLoader() = default;
 

@@ -9,13 +9,13 @@
 // Each text could declare entities and expand them up to the limit of a whole document, so a document type is refused here.
 #include "embedded/cimxml/TCimXmlObjectReader.h"
 
-#include <algorithm>
 #include <utility>
 #include <vector>
 
 #include "embedded/cimxml/MessageText.h"
 #include "embedded/cimxml/TCimXmlReader.h"
 #include "embedded/cimxml/TXmlReader.h"
+#include "embedded/value/TEmbeddedObject.h"
 #include "embedded/value/TValueAccess.h"
 
 namespace NORVZEL20 {
@@ -23,7 +23,7 @@ namespace NORVZEL20 {
 /// The readers for one level of nesting.
 class TCimXmlObjectReader::TNested {
   public:
-    TNested(TCimXmlContext& context, const boost::shared_ptr<TInMemNamespace>& ns)
+    TNested(TCimXmlContext& context, const boost::shared_ptr<const TInMemNamespace>& ns)
         : fContext(context), fReader(context, ns, nullptr), fXml(fReader)
     {
         fXml.RefuseDocumentTypes();
@@ -48,17 +48,12 @@ class TCimXmlObjectReader::TNested {
     TXmlReader fXml;
 };
 
-TCimXmlObjectReader::TCimXmlObjectReader(TCimXmlContext& context, boost::shared_ptr<TInMemNamespace> ns, TCimXmlPathReader& paths)
+TCimXmlObjectReader::TCimXmlObjectReader(TCimXmlContext& context, boost::shared_ptr<const TInMemNamespace> ns,
+                                         TCimXmlPathReader& paths)
     : fContext(context), fNamespace(std::move(ns)), fPaths(paths)
 {}
 
 TCimXmlObjectReader::~TCimXmlObjectReader() = default;
-
-bool TCimXmlObjectReader::LooksLikeObject(std::string_view text)
-{
-    const auto start = std::find_if_not(text.begin(), text.end(), TXmlReader::IsBlank);
-    return start != text.end() && *start == '<';
-}
 
 TCIMValue TCimXmlObjectReader::Read(std::string_view text)
 {
@@ -86,7 +81,7 @@ TCIMValue TCimXmlObjectReader::ReadAll(const TCIMValue& value)
         }
         return TCIMValue(value.GetType(), static_cast<unsigned int>(elements.size()), elements);
     }
-    return TValueAccess::IsText(value) && LooksLikeObject(value.GetString()) ? Read(value.GetString()) : value;
+    return TValueAccess::IsText(value) && TEmbeddedObject::IsPerhapsText(value.GetString()) ? Read(value.GetString()) : value;
 }
 
 }  // namespace NORVZEL20

@@ -19,13 +19,10 @@ class TCimXmlObjectReader {
   public:
     /// The classes of references are looked up in `ns` (may be null). `paths` is notified of references to classes that are
     /// not declared yet. `context` and `paths` must outlive the reader.
-    TCimXmlObjectReader(TCimXmlContext& context, boost::shared_ptr<TInMemNamespace> ns, TCimXmlPathReader& paths);
+    TCimXmlObjectReader(TCimXmlContext& context, boost::shared_ptr<const TInMemNamespace> ns, TCimXmlPathReader& paths);
     TCimXmlObjectReader(const TCimXmlObjectReader&) = delete;
     TCimXmlObjectReader& operator=(const TCimXmlObjectReader&) = delete;
     ~TCimXmlObjectReader();
-
-    /// Whether text may be an embedded object: writers that do not mark objects also write plain text into the same property.
-    static bool LooksLikeObject(std::string_view text);
 
     /// The embedded object that the text describes.
     TCIMValue Read(std::string_view text);
@@ -36,7 +33,7 @@ class TCimXmlObjectReader {
     class TNested;
 
     TCimXmlContext& fContext;
-    boost::shared_ptr<TInMemNamespace> fNamespace;
+    boost::shared_ptr<const TInMemNamespace> fNamespace;
     TCimXmlPathReader& fPaths;
     std::unique_ptr<TNested> fNested;  // made for the first object and kept, because an XML parser is expensive to make
 };

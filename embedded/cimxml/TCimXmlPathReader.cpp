@@ -35,6 +35,13 @@ constexpr std::size_t kMaxDepth = 12;
 using EStatus = TZELStatusCode::EStatusCode;
 using TType = TCIMValue::TCIMType;
 
+/// Whether a text has turned out to be a path or an embedded object.
+bool BecameStructured(const TCIMValue& before, const TCIMValue& now)
+{
+    const TValueAccess::EForm form = TValueAccess::GetForm(now);
+    return TValueAccess::IsText(before) && (form == TValueAccess::kPath || form == TValueAccess::kObject);
+}
+
 /// A number whose type the document does not give: the first of these types that can hold it.
 bool ReadNumber(std::string_view text, TCIMValue& value)
 {
@@ -44,7 +51,7 @@ bool ReadNumber(std::string_view text, TCIMValue& value)
 
 }  // namespace
 
-TCimXmlPathReader::TCimXmlPathReader(TCimXmlContext& context, boost::shared_ptr<TInMemNamespace> ns)
+TCimXmlPathReader::TCimXmlPathReader(TCimXmlContext& context, boost::shared_ptr<const TInMemNamespace> ns)
     : fContext(context), fNamespace(std::move(ns)), fFrames(1)
 {}
 
@@ -85,9 +92,9 @@ TCIMReference TCimXmlPathReader::End()
     for (const auto& [declared, value] : frame.keys) {
         std::string name = declared.empty() ? FindOnlyKey(cls.get()) : declared;
         TCIMValue adapted = value;
-        if (!cls || TReferenceAdapter(*fNamespace).AdaptKey(*cls, name, adapted) == nullptr) {
+        if (!cls || TReferenceAdapter(*fNamespace, fContext.GetEmbeddedDepth()).AdaptKey(*cls, name, adapted) == nullptr) {
             fContext.CheckName("key", name);
-        } else if (adapted.GetType() == TType::kReference && value.GetType() != TType::kReference) {
+        } else if (BecameStructured(value, adapted)) {
             fContext.GetOwnPlace().MakeLocal(adapted);
             fMetUnsettled = true;  // perhaps: the text names a class that may be declared later
         }

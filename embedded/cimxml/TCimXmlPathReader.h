@@ -22,7 +22,7 @@ namespace NORVZEL20 {
 class TCimXmlPathReader {
   public:
     /// Classes are looked up in `ns` (may be null). `context` must outlive the reader.
-    TCimXmlPathReader(TCimXmlContext& context, boost::shared_ptr<TInMemNamespace> ns);
+    TCimXmlPathReader(TCimXmlContext& context, boost::shared_ptr<const TInMemNamespace> ns);
 
     /// Begins a path inside of the innermost one. Errors: kParseError (9) if paths are nested too deeply.
     void Begin();
@@ -73,7 +73,7 @@ class TCimXmlPathReader {
     const std::string& FindOnlyKey(const TInMemClass* cls) const;
 
     TCimXmlContext& fContext;
-    boost::shared_ptr<TInMemNamespace> fNamespace;
+    boost::shared_ptr<const TInMemNamespace> fNamespace;
     boost::shared_ptr<TInMemClass> fLastClass;
     std::vector<TFrame> fFrames;  // kept for their memory; fDepth of them are open
     std::size_t fDepth = 0;

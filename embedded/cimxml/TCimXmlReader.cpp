@@ -35,7 +35,7 @@ bool IsMarkedEmbedded(const TCimXmlAttributes& attributes)
 
 }  // namespace
 
-TCimXmlReader::TCimXmlReader(TCimXmlContext& context, const boost::shared_ptr<TInMemNamespace>& ns, TCimXmlLoader* loader)
+TCimXmlReader::TCimXmlReader(TCimXmlContext& context, const boost::shared_ptr<const TInMemNamespace>& ns, TCimXmlLoader* loader)
     : fContext(context), fLoader(loader), fPaths(context, ns), fObjects(context, ns, fPaths), fDraft(context),
       fProperty(context, fObjects), fQualifier(context, fObjects)
 {

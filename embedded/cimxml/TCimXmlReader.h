@@ -25,7 +25,7 @@ namespace NORVZEL20 {
 class TCimXmlReader : public TXmlReader::ISink {
   public:
     /// The classes of references are looked up in `ns` (may be null). `context` and `loader` (may be null) must outlive the reader.
-    TCimXmlReader(TCimXmlContext& context, const boost::shared_ptr<TInMemNamespace>& ns, TCimXmlLoader* loader);
+    TCimXmlReader(TCimXmlContext& context, const boost::shared_ptr<const TInMemNamespace>& ns, TCimXmlLoader* loader);
 
     void OnStart(const char* name, const char** attributes) override;
     void OnEnd(const char* name) override;

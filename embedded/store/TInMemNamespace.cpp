@@ -46,6 +46,11 @@ const std::string& TInMemNamespace::GetNamespaceName() const
     return fName;
 }
 
+TCIMValue TInMemNamespace::ReadObject(const TCIMValue& text, std::size_t depth) const
+{
+    return fReadObject != nullptr ? fReadObject(text, shared_from_this(), depth) : text;
+}
+
 boost::shared_ptr<INamespaceProvider> TInMemNamespace::GetNamespaceProvider(TCallContext) const
 {
     return TInMemNamespaceProvider::GetInstance();

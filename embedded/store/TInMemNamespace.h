@@ -1,6 +1,7 @@
 #pragma once
 
 #include <boost/smart_ptr/enable_shared_from_this.hpp>
+#include <cstddef>
 #include <memory>
 #include <string>
 #include <string_view>
@@ -53,8 +54,10 @@ class CIMDELTA_EXPORT TInMemNamespace final : public ICIMNamespace,
     void Subscribe(boost::shared_ptr<ICIMIndicationFilter> filter,
                    const boost::function<bool(boost::shared_ptr<ICIMInstance>)>& callback, TCallContext context) override;
     /// The path's class and keys count, its namespace and host do not. Key values are converted to the declared types if nothing is
-    /// lost by it, so a path read from text finds what it names. Errors: kNotFound (15), kTypeMismatch (13) if a key cannot be
-    /// converted, kKeyMissing (14) if the path lacks one. A TStoreRefusal says which path and which key.
+    /// lost by it. If no instance has these keys, references in them are also tried as a load stores them: without a namespace that
+    /// is this one's own (GetOwnPlace), with names and keys as declared; and text that is an embedded object as that object, once a
+    /// document was loaded. So a path read from text finds what it names. Errors: kNotFound (15), kTypeMismatch (13) if a key
+    /// cannot be converted, kKeyMissing (14) if the path lacks one. A TStoreRefusal says which path and which key.
     boost::shared_ptr<ICIMInstance> GetInstance(const TCIMReference& path, TCallContext context) const override;
     /// Errors: those of GetInstance.
     void DeleteInstance(const TCIMReference& path, TCallContext context) override;
@@ -88,6 +91,12 @@ class CIMDELTA_EXPORT TInMemNamespace final : public ICIMNamespace,
     /// that, the name of the namespace with any host.
     const TOwnPlace& GetOwnPlace() const noexcept { return fOwnPlace; }
     void SetOwnPlace(TOwnPlace place) noexcept { fOwnPlace = std::move(place); }
+    /// Reads the text of a key whose declaration says that it holds embedded objects. `depth` counts the objects around the key.
+    /// Returns the text itself if it is no object.
+    using TReadObject = TCIMValue (*)(const TCIMValue& text, const boost::shared_ptr<const TInMemNamespace>& ns, std::size_t depth);
+    /// Without a reader, as before the first document is loaded, keys stay text: they are found by the canonical text alone.
+    void SetObjectReader(TReadObject read) noexcept { fReadObject = read; }
+    TCIMValue ReadObject(const TCIMValue& text, std::size_t depth) const;
     /// Call this after the text of a reference may have changed, with the spelling of a class or of a key: instances with
     /// references in their keys are then found by the new text.
     void ReferenceTextsChanged();
@@ -109,9 +118,11 @@ class CIMDELTA_EXPORT TInMemNamespace final : public ICIMNamespace,
     };
 
     boost::shared_ptr<TInMemInstance> RequireInstance(const TCIMReference& path) const;
+    bool AdaptKeys(const TInMemLayout& layout, std::vector<TCIMValue>& keys) const;
 
     std::string fName;
     TOwnPlace fOwnPlace;
+    TReadObject fReadObject = nullptr;
     boost::shared_ptr<TInMemClass> fRoot;  // "<root>": its subclasses are the top-level classes
     std::vector<boost::shared_ptr<TInMemClass>> fClasses;
     TNameHashMap<TEntry> fClassesByName;

@@ -2,9 +2,14 @@
 //
 // Only the class and the keys of the path count. Its key values are converted to the declared types first, because a path that was
 // read from text has types that are only guessed. The extent of the class then finds the instance by its keys.
+//
+// A reference among the keys, or an embedded object, may still be written in another way than the one that the store has: with the
+// own namespace, with names in another letter case, with keys as text. Only if nothing is found, such keys are adapted as they are
+// at a load, and looked for again. So what was stored as it is, without a load, is found as it is.
 
 #include "embedded/store/TInMemExtent.h"
 #include "embedded/store/TInMemNamespace.h"
+#include "embedded/store/TReferenceAdapter.h"
 #include "embedded/store/TStoreRefusal.h"
 #include "embedded/value/TValueText.h"
 
@@ -44,7 +49,27 @@ boost::shared_ptr<TInMemInstance> TInMemNamespace::FindInstance(const TCIMRefere
         keys.push_back(GetKey(path, layout.GetDecl(slot)));
     }
     // A path with more keys than the class names no instance.
-    return path.GetKeyCount() == keys.size() ? cls->GetExtent().Find(keys) : nullptr;
+    if (path.GetKeyCount() != keys.size()) {
+        return nullptr;
+    }
+    boost::shared_ptr<TInMemInstance> found = cls->GetExtent().Find(keys);
+    return found || !AdaptKeys(layout, keys) ? found : cls->GetExtent().Find(keys);
+}
+
+/// Brings references and embedded objects among the keys in the form that they have after a load. Returns whether any changed.
+bool TInMemNamespace::AdaptKeys(const TInMemLayout& layout, std::vector<TCIMValue>& keys) const
+{
+    const TReferenceAdapter adapter(*this, fOwnPlace);
+    bool isChanged = false;
+    for (std::size_t i = 0; i < keys.size(); ++i) {
+        TCIMValue read;
+        if (adapter.ConvertKey(layout.GetDecl(layout.GetKeys()[i]), keys[i], read)) {
+            keys[i] = read;
+            isChanged = true;
+        }
+        isChanged = adapter.Adapt(keys[i]) || isChanged;
+    }
+    return isChanged;
 }
 
 boost::shared_ptr<TInMemInstance> TInMemNamespace::RequireInstance(const TCIMReference& path) const

@@ -5,9 +5,10 @@
 // itself and with keys of the declared spelling and type. A key may be a reference, so this goes on inside; arrays and the
 // properties of embedded objects are searched too. A value in which nothing changes is not copied.
 //
-// A key that was text may turn out to be a reference only now. It then has to look as if it had been one from the start: without
-// the own namespace (TOwnPlace), and with text again in the place of what nests too deeply (TValueAccess::LimitDepth). That text is
-// the one that a reference would have in the path, so it does not matter in which steps the references were made.
+// A key that was text may turn out to be a reference only now, or an embedded object. It then has to look as if it had been one
+// from the start: without the own namespace (TOwnPlace), and with text again in the place of what nests too deeply
+// (TValueAccess::LimitDepth). That text is the one that a reference would have in the path, so it does not matter in which steps
+// the references were made.
 //
 // If a reference that is a key, or in an embedded object that is one, changes, its instance has another path. The index of the
 // extent is renewed afterwards, and two instances may turn out to have one path, if their keys differed in nothing but the spelling
@@ -18,6 +19,7 @@
 #include <unordered_set>
 
 #include "embedded/value/ChangeReferences.h"
+#include "embedded/value/TEmbeddedObject.h"
 #include "embedded/value/TValueAccess.h"
 #include "embedded/value/TValueText.h"
 
@@ -102,16 +104,29 @@ const TInMemPropertyDecl* TReferenceAdapter::AdaptKey(const TInMemClass& cls, st
     return &decl;
 }
 
+/// Most keys are of the declared type already, and plain text; for those it looks no further than the first character.
+bool TReferenceAdapter::ConvertKey(const TInMemPropertyDecl& decl, const TCIMValue& value, TCIMValue& converted) const
+{
+    if (value.GetType() != decl.GetType()) {
+        return TValueText::ConvertKey(value, decl.GetType(), converted);
+    }
+    if (!TAccess::IsText(value) || !TEmbeddedObject::IsPerhapsText(TAccess::GetText(value)) || !decl.HoldsObjects()) {
+        return false;
+    }
+    converted = fNamespace.ReadObject(value, fEmbeddedDepth);
+    return !TAccess::IsText(converted);
+}
+
 bool TReferenceAdapter::AdaptKeyValue(const TInMemPropertyDecl& decl, TCIMValue& value) const
 {
     TCIMValue adapted;
-    if (value.GetType() == decl.GetType() || !TValueText::ConvertKey(value, decl.GetType(), adapted)) {
+    if (!ConvertKey(decl, value, adapted)) {
         return false;
     }
-    Adapt(adapted);  // text may have become a reference
+    Adapt(adapted);  // text may have become a reference, or an object with references
     TAccess::LimitDepth(adapted, kLevelsAbove);
-    // A path that nests too deeply is text again.
-    const bool isChanged = adapted.GetType() != value.GetType() || adapted != value;
+    // What nests too deeply is text again.
+    const bool isChanged = TAccess::GetForm(adapted) != TAccess::GetForm(value) || adapted != value;
     value = adapted;
     return isChanged;
 }

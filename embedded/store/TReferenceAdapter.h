@@ -1,5 +1,6 @@
 #pragma once
 
+#include <cstddef>
 #include <string>
 #include <vector>
 
@@ -19,15 +20,20 @@ class CIMDELTA_INTERNAL_EXPORT TReferenceAdapter {
     static constexpr unsigned int kLevelsAbove = 1;
 
     /// References keep the namespaces that they name. `ns` must outlive this.
-    explicit TReferenceAdapter(const TInMemNamespace& ns) noexcept : fNamespace(ns) {}
+    /// `embeddedDepth` counts the embedded objects around the references.
+    explicit TReferenceAdapter(const TInMemNamespace& ns, std::size_t embeddedDepth = 0) noexcept
+        : fNamespace(ns), fEmbeddedDepth(embeddedDepth)
+    {}
     /// References to `ownPlace` lose namespace and host. Both must outlive this.
     TReferenceAdapter(const TInMemNamespace& ns, const TOwnPlace& ownPlace) noexcept : fNamespace(ns), fOwnPlace(&ownPlace) {}
 
     /// Gives a key of a path its declared spelling, and its value as AdaptKeyValue. Returns the declaration. If `cls` has no
     /// property of that name, it returns null and leaves the key alone.
     const TInMemPropertyDecl* AdaptKey(const TInMemClass& cls, std::string& name, TCIMValue& value) const;
-    /// Gives the value of a key its declared type if that loses nothing, and adapts it if it has become a reference. Returns
-    /// whether it changed.
+    /// The value of a key in its declared type if that loses nothing; text is read if it is an embedded object by its declaration.
+    /// References in it are as they were written. Returns false if `value` is to stay as it is.
+    bool ConvertKey(const TInMemPropertyDecl& decl, const TCIMValue& value, TCIMValue& converted) const;
+    /// Converts the value of a key and adapts what it has become. Returns whether it changed.
     bool AdaptKeyValue(const TInMemPropertyDecl& decl, TCIMValue& value) const;
 
     /// Adapts the references in `value`. Returns false if nothing in it was to be changed.
@@ -46,6 +52,7 @@ class CIMDELTA_INTERNAL_EXPORT TReferenceAdapter {
     bool AdaptInstance(TInMemInstance& instance, const std::vector<std::uint32_t>& slots) const;
 
     const TInMemNamespace& fNamespace;
+    std::size_t fEmbeddedDepth = 0;
     const TOwnPlace* fOwnPlace = nullptr;  // null: namespaces stay
 };
 

@@ -85,6 +85,14 @@ class CIMDELTA_INTERNAL_EXPORT TEmbeddedObject {
     /// because XML could not hold it. A bag has its elements in the order of their texts.
     std::string GetKeyText() const;
 
+    /// Whether text may be that of an embedded object: if its first character that is no blank is a `<`. Writers that do not mark
+    /// objects also write plain text into the same property.
+    static bool IsPerhapsText(std::string_view text) noexcept
+    {
+        const std::size_t start = text.find_first_not_of(" \t\r\n");
+        return start != std::string_view::npos && text[start] == '<';
+    }
+
   private:
     std::string fClassName;
     std::string fSuperClassName;

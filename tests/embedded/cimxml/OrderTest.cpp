@@ -189,6 +189,63 @@ TEST(OrderTest, PathsInTextThatNestTooDeeplyStayTextInEveryOrder)
     }
 }
 
+const std::string kState =
+    Object(std::string("<CLASS NAME=\"State\"><PROPERTY NAME=\"S\" TYPE=\"string\">") + kKey +
+           "<QUALIFIER NAME=\"EmbeddedObject\" TYPE=\"boolean\"><VALUE>TRUE</VALUE></QUALIFIER></PROPERTY></CLASS>");
+
+std::string StateName(const std::string& text)
+{
+    return "<INSTANCENAME CLASSNAME=\"State\"><KEYBINDING NAME=\"S\"><KEYVALUE>" + Escaped(text) +
+           "</KEYVALUE></KEYBINDING></INSTANCENAME>";
+}
+
+TEST(OrderTest, AKeyThatIsAnObjectHasOneTextInEveryOrderAndSpelling)
+{
+    const std::string use =
+        Object(std::string("<CLASS NAME=\"Use\"><PROPERTY.REFERENCE NAME=\"R\">") + kKey + "</PROPERTY.REFERENCE></CLASS>");
+    const std::string text = "<INSTANCE CLASSNAME=\"Se\"><PROPERTY NAME=\"B\" TYPE=\"string\"><VALUE>2</VALUE></PROPERTY>"
+                             "<PROPERTY NAME=\"A\" TYPE=\"string\"><VALUE>1</VALUE></PROPERTY></INSTANCE>";
+    const std::string instance =
+        Object("<INSTANCE CLASSNAME=\"Use\">" + ReferenceTo("R", "<VALUE.REFERENCE>" + StateName(text) + "</VALUE.REFERENCE>") +
+               "</INSTANCE>");
+    const std::string key = "<INSTANCE CLASSNAME=\"se\"><PROPERTY NAME=\"a\" TYPE=\"string\"><VALUE>1</VALUE></PROPERTY>"
+                            "<PROPERTY NAME=\"b\" TYPE=\"string\"><VALUE>2</VALUE></PROPERTY></INSTANCE>";
+    const std::string contents = ContentsInEveryOrder({kState, use, instance});
+    EXPECT_EQ("root/cimv2:Use.R=" + Quoted("State.S=" + Quoted(key)), contents.substr(0, contents.find(" R ")));
+    EXPECT_EQ(std::string::npos, contents.find("or\n"));
+    const std::string named = "<VALUE.NAMEDINSTANCE>" + StateName(text) + "<INSTANCE CLASSNAME=\"State\"/></VALUE.NAMEDINSTANCE>\n";
+    const std::string fromName = ContentsInEveryOrder({kState, use, named});
+    EXPECT_EQ("root/cimv2:State.S=" + Quoted(key), fromName.substr(0, fromName.find(" S ")));
+    EXPECT_EQ(std::string::npos, fromName.find("or\n"));
+}
+
+TEST(OrderTest, AKeyThatOnlyLooksLikeAnObjectStaysText)
+{
+    for (const char* const text : {"<", "<INSTANCE>", "<INSTANCE CLASSNAME=\"a.b\"", "<!DOCTYPE x><INSTANCE CLASSNAME=\"A\"/>"}) {
+        TLoading loading;
+        loading.Load(TLoading::Group(kState + "<VALUE.NAMEDINSTANCE>" + StateName(text) +
+                                     "<INSTANCE CLASSNAME=\"State\"/></VALUE.NAMEDINSTANCE>\n"));
+        EXPECT_EQ("root/cimv2:State.S=" + Quoted(text) + "\n", loading.PathsOf("State"));
+    }
+}
+
+TEST(OrderTest, APathIsFoundHoweverItsReferencesAndObjectsAreWritten)
+{
+    TLoading loading;
+    const std::string part =
+        Object(std::string("<CLASS NAME=\"Part\"><PROPERTY.REFERENCE NAME=\"On\">") + kKey + "</PROPERTY.REFERENCE></CLASS>");
+    loading.Load(TLoading::Group(kDisk + part + kState +
+                                 Object("<INSTANCE CLASSNAME=\"Part\">" + ReferenceTo("On", DiskPath("7")) + "</INSTANCE>") +
+                                 "<VALUE.NAMEDINSTANCE>" + StateName("<INSTANCE CLASSNAME=\"Se\"/>") +
+                                 "<INSTANCE CLASSNAME=\"State\"/></VALUE.NAMEDINSTANCE>\n"));
+    for (const char* const inner : {"Disk.Id=7", "disk.id=7", "disk.id=\"7\"", "root/cimv2:disk.ID=7", "/ROOT/cimv2:Disk.Id=7"}) {
+        EXPECT_EQ("Disk.Id=7", loading.ValueOf("part.on=" + Quoted(inner), "On")) << inner;
+    }
+    EXPECT_NE(nullptr, loading.Find("State.S=" + Quoted("<INSTANCE  CLASSNAME=\"SE\"></INSTANCE>")));
+    EXPECT_THROW(loading.Find("part.on=" + Quoted("root/other:Disk.Id=7")), TZELException);
+    EXPECT_THROW(loading.Find("State.S=" + Quoted("<INSTANCE CLASSNAME=\"other\"/>")), TZELException);
+}
+
 TEST(OrderTest, InstancesOfAClassStayInTheDocumentsOrder)
 {
     TLoading loading;
