@@ -16,7 +16,7 @@ struct TCoverage {
         kReachedByNoElement,   ///< no element of the rules is for the class or one above it
         kNothingToCompare,     ///< the class has no property, or only the time of collection
         kUnknownToReference,   ///< the reference does not declare the class
-        kOperatingSystemMade,  ///< the client made so many instances of KALMO_OperatingSystem that no real ones meet
+        kOperatingSystemMade,  ///< the client made the reference's instance of KALMO_OperatingSystem, or those of all others
     };
 
     /// Why a property of a compared class is not compared.
