@@ -6,8 +6,8 @@
 //
 //   adding       with two inventories, an instance that only the other one has is recorded and then added to the reference. If that
 //                failed, the last record is the instance's.
-//   comparing    a pair of instances cannot be compared if a property is missing in the other inventory, if it is a reference in
-//                the reference alone, or if the reference (with two inventories) cannot take over a value of another type.
+//   comparing    a pair of instances cannot be compared if a property is missing in the other inventory, if the engine refuses
+//                its values, or if the reference (with two inventories) cannot take over a value of another type.
 //   matching     an instance cannot be matched if the plug-in cannot make its key.
 #include "client/comparison/TFaultSearch.h"
 
@@ -42,16 +42,6 @@ std::string DescribeTypes(const TInMemClass& cls, const TInMemPropertyDecl& prop
 std::string KeysOf(const TInMemClass& cls)
 {
     return boost::algorithm::join(KeyNamesOf(cls), ", ");
-}
-
-// Whether a run over `count` namespaces cannot compare two values: see the plug-in's comparison of instances.
-bool IsRefused(const TCIMValue& master, TCIMValue::TCIMType declared, const TCIMValue& other, std::size_t count)
-{
-    if (other.IsNull() || other.GetType() == declared) {
-        return false;
-    }
-    const bool isComparedByPath = declared == TCIMValue::TCIMType::kReference && !master.IsNull();
-    return isComparedByPath || count == 2;
 }
 
 }  // namespace
@@ -169,6 +159,14 @@ TFaultSearch::TCause TFaultSearch::CheckKeys(const TInventory& inventory, const 
     return {};
 }
 
+// The engine refuses some pairs of values. A reference that takes over the other's value refuses one of another type.
+bool TFaultSearch::IsRefused(const TInMemClass& cls, const TCIMValue& master, const TCIMValue& other,
+                             const TInMemPropertyDecl& declared) const
+{
+    const bool isTakenOver = fInventories.size() == 2 && !other.IsNull();
+    return fRules.Refuse(cls.GetName(), master, other) || (isTakenOver && other.GetType() != declared.GetType());
+}
+
 TFaultSearch::TCause TFaultSearch::CheckPair(const ICIMInstance& master, const TInMemInstance& instance,
                                              const TInventory& inventory, const std::vector<std::string>& properties) const
 {
@@ -179,7 +177,7 @@ TFaultSearch::TCause TFaultSearch::CheckPair(const ICIMInstance& master, const T
         if (!there) {
             return {inventory.path + " does not declare " + Named(name, cls), kCompleted};
         }
-        if (IsRefused(ValueOf(master, name), declared->GetType(), ValueOf(instance, name), fInventories.size())) {
+        if (IsRefused(cls, ValueOf(master, name), ValueOf(instance, name), *declared)) {
             return {DescribeTypes(cls, *declared, fInventories[0], *there, inventory), "the values are reported as different"};
         }
     }

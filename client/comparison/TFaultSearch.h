@@ -37,6 +37,8 @@ class TFaultSearch {
     TCause CheckKeys(const TInventory& inventory, const std::string& className) const;
     TCause CheckPair(const ICIMInstance& master, const TInMemInstance& instance, const TInventory& inventory,
                      const std::vector<std::string>& properties) const;
+    bool IsRefused(const TInMemClass& cls, const TCIMValue& master, const TCIMValue& other,
+                   const TInMemPropertyDecl& declared) const;
     TCause CheckProperties(const TInMemClass& cls, const TInMemInstance& added, const std::string& key) const;
     TCause CheckNewKeys(const TInMemClass& cls, const TInMemInstance& added, const std::string& key) const;
 

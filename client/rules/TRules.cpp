@@ -6,6 +6,7 @@
 #include <algorithm>
 
 #include "client/rules/TRulesParser.h"
+#include "host/TZELException.h"
 
 namespace NORVZEL20 {
 
@@ -31,11 +32,22 @@ std::string TRules::KeyOf(const std::string& className, const boost::shared_ptr<
 
 bool TRules::Differ(const std::string& className, const TCIMValue& reference, const TCIMValue& other)
 {
-    // The engine refuses to compare a reference with a value of another type.
-    if (reference.GetType() != other.GetType()) {
-        return !reference.IsNull() || !other.IsNull();
+    // It refuses no values of one type.
+    const bool isRefused = reference.GetType() != other.GetType() && Refuse(className, reference, other);
+    return isRefused || fEngine.IsDifferent(Find(className), reference, other);
+}
+
+bool TRules::Refuse(const std::string& className, const TCIMValue& reference, const TCIMValue& other)
+{
+    try {
+        fEngine.IsDifferent(Find(className), reference, other);
+        return false;
+    } catch (const TZELException& error) {
+        if (error.GetStatusCode() != TZELStatusCode::kTypeMismatch) {
+            throw;
+        }
+        return true;
     }
-    return fEngine.IsDifferent(Find(className), reference, other);
 }
 
 const std::vector<std::string>& TRules::ExcludedKeysOf(const std::string& className)

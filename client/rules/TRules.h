@@ -14,7 +14,7 @@
 
 namespace NORVZEL20 {
 
-/// Rules as the plug-in's own parser reads it, and the plug-in's own answers to what follows from it.
+/// Rules as the plug-in's own parser reads them, and the plug-in's own answers to what follows from them.
 class TRules {
   public:
     /// `schema` is the reference. Errors: TClientError that names the rules, the line, what is wrong there and what can be done.
@@ -29,8 +29,11 @@ class TRules {
     std::string KeyOf(const std::string& className, const boost::shared_ptr<ICIMInstance>& instance);
 
     /// Whether the engine takes two values of a property of class `className` for different. The first one stands in the place of
-    /// the reference's: if it is a bag, the order of the elements does not count.
+    /// the reference's: if it is a bag, the order of the elements does not count. True for values that the engine refuses.
     bool Differ(const std::string& className, const TCIMValue& reference, const TCIMValue& other);
+
+    /// Whether the engine refuses to compare two such values: a reference with a value of another type.
+    bool Refuse(const std::string& className, const TCIMValue& reference, const TCIMValue& other);
 
     /// The class's excluded keys, in the order of the rules.
     const std::vector<std::string>& ExcludedKeysOf(const std::string& className);
