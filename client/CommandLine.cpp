@@ -131,7 +131,7 @@ class TCommandLine {
         if (!arguments.empty() && arguments.front() == "help") {
             arguments.erase(std::remove_if(arguments.begin() + 1, arguments.end(), &IsHelpOption), arguments.end());
             if (const std::string extra = ExtraArgumentOfHelp(arguments); !extra.empty()) {
-                return Refuse("The following argument was not expected: " + extra + "; see cimdelta --help", console);
+                return Refuse(extra + " is one argument too many; see cimdelta --help", console);
             }
             arguments = HelpAsOption(arguments);
         }
