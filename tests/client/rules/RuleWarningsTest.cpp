@@ -43,6 +43,18 @@ class RuleWarningsTest : public ::testing::Test {
         return WarningsOf(parser, elements, parser.GetNamedClasses(), false);
     }
 
+    struct TRow {
+        std::vector<std::string> elements;
+        std::string warnings;
+    };
+
+    void ExpectWarnings(const std::vector<TRow>& rows) const
+    {
+        for (const TRow& row : rows) {
+            EXPECT_EQ(row.warnings, Warnings(row.elements)) << Text(row.elements);
+        }
+    }
+
     static std::string Text(const std::vector<std::string>& elements)
     {
         std::string text = "<DifftoolSpec>";
@@ -108,33 +120,32 @@ TEST_F(RuleWarningsTest, TheAdviceAboutOrderLeadsToRulesWithoutWarnings)
     EXPECT_EQ("", Warnings({"<class name='B' excludekeys='L'/>", ancestor, rest}));
 }
 
-TEST_F(RuleWarningsTest, EachIsGivenForItsCause)
+TEST_F(RuleWarningsTest, AnElementOnTheWrongSideOfItsAncestorGetsOne)
 {
-    const struct {
-        std::vector<std::string> elements;
-        const char* warnings;
-    } rows[] = {
+    ExpectWarnings({
         {{"<class name='A' default='include'/>", "<class name='B' excludekeys='L'/>"},
          "2 excludekeys of class B has no effect: the class already has the rules of its ancestor A (line 1); put this element "
-         "before "
-         "that one\n"
+         "before that one\n"
          "2 class B is not compared: this element has no default, which means exclude, and no list includes a property; write "
          "default=\"include\" or default=\"exclude\"\n"},
         {{"<class name='D' default='include'/>", "<class name='A' default='exclude'/>"},
          "1 the element for class D is read before that of its ancestor A (line 2), whose default and lists replace its own; put "
-         "it "
-         "after that one\n"},
+         "it after that one\n"},
         // Said once, of the element that decides in the end.
         {{"<class name='D' default='include'/>", "<class name='B' default='exclude'/>", "<class name='A' default='exclude'/>",
           "<class name='A' default='include'/>"},
          "1 the element for class D is read before that of its ancestor A (line 4), whose default and lists replace its own; put "
-         "it "
-         "after that one\n"
+         "it after that one\n"
          "2 the element for class B is read before that of its ancestor A (line 4), whose default and lists replace its own; put "
-         "it "
-         "after that one\n"},
+         "it after that one\n"},
         // The ancestor came later, but then the class again.
         {{"<class name='D' default='include'/>", "<class name='A' default='exclude'/>", "<class name='D' default='include'/>"}, ""},
+    });
+}
+
+TEST_F(RuleWarningsTest, AnElementThatComesTooLateGetsOne)
+{
+    ExpectWarnings({
         {{"<class name='C' default='include'/>", "<class name='C' default='include'/>", "<class name='C' default='include'/>"},
          "3 this element for class C has no effect: the rules of the class were final after line 2; put what is meant there\n"},
         {{"<class name='A' default='include'/>", "<class name='B' default='include'/>",
@@ -142,6 +153,12 @@ TEST_F(RuleWarningsTest, EachIsGivenForItsCause)
          "3 this element for class B has no effect: the rules of the class were final after line 2; put what is meant there\n"},
         {{"<class name='C' default='include'/>", "<class name='C' default='include' excludekeys='K'/>"},
          "2 excludekeys of class C has no effect: the class has the keys of its first element, at line 1; name them there\n"},
+    });
+}
+
+TEST_F(RuleWarningsTest, KeysAndNamesThatDoNotApplyGetOne)
+{
+    ExpectWarnings({
         {{"<class name='A' default='include' excludekeys='p'/>"}, "1 excluded key p is not a key of class A\n"},
         {{"<class name='A' default='include' excludekeys='k'/>"},
          "1 excluded key k of class A is declared as K; letter case counts in rules, so it still counts as a key\n"},
@@ -154,6 +171,12 @@ TEST_F(RuleWarningsTest, EachIsGivenForItsCause)
           "</excludelist></class>"},
          "1 property q of class A is already listed in this element; the first listing counts\n"
          "1 property P of class A is declared as p; letter case counts in rules\n"},
+    });
+}
+
+TEST_F(RuleWarningsTest, AnElementThatComparesNothingGetsOne)
+{
+    ExpectWarnings({
         {{"<class name='A'/>", "<class name='X' default='include'/>"},
          "1 class A is not compared: this element has no default, which means exclude, and no list includes a property; write "
          "default=\"include\" or default=\"exclude\"\n"},
@@ -161,10 +184,7 @@ TEST_F(RuleWarningsTest, EachIsGivenForItsCause)
          "1 property p of class A is already listed in this element; the first listing counts\n"
          "1 class A is not compared: this element has no default, which means exclude, and no list includes a property; write "
          "default=\"include\" or default=\"exclude\"\n"},
-    };
-    for (const auto& row : rows) {
-        EXPECT_EQ(row.warnings, Warnings(row.elements)) << Text(row.elements);
-    }
+    });
 }
 
 TEST_F(RuleWarningsTest, ATimeOfCollectionThatIsListedInVainIsNamed)
