@@ -15,6 +15,15 @@ namespace NORVZEL20 {
 
 using EStatus = TZELStatusCode::EStatusCode;
 
+namespace {
+
+std::string Show(const TCIMValue& value)
+{
+    return value.IsNull() ? "NULL" : Quote(value.ToText());
+}
+
+}  // namespace
+
 bool TCimXmlInstanceBuilder::Begin(const char* className)
 {
     TCimXmlLayout* layout = FindLayout(className);
@@ -66,7 +75,7 @@ TCimXmlTarget TCimXmlInstanceBuilder::FindProperty(const char* name)
     fLayout->given[slot] = fNumber;
     fExpected = fLayout->positions[slot] + 1;
     const TInMemPropertyDecl& decl = cls.GetLayout().GetDecl(slot);
-    return {&decl.GetName(), slot, decl.GetType(), fLayout->embedded[slot]};
+    return {&decl.GetName(), slot, decl.GetType(), fLayout->embedded[slot], decl.IsStatic()};
 }
 
 void TCimXmlInstanceBuilder::SetProperty(const TCimXmlTarget& target, TCIMValue&& value, bool isUnsettled)
@@ -76,13 +85,31 @@ void TCimXmlInstanceBuilder::SetProperty(const TCimXmlTarget& target, TCIMValue&
         // A reference that was text names a class that may be declared later.
         isUnsettled = isUnsettled || target.type.GetElementType() == TCIMValue::TCIMType::kReference;
     }
-    fInstance->SetSlot(target.slot, std::move(value));
+    if (target.isStatic) {
+        SetStatic(target, value);
+    } else {
+        fInstance->SetSlot(target.slot, std::move(value));
+    }
     if (!isUnsettled) {
         return;
     }
     fLate.NoteReference(fInstance, target.slot, fClasses.CountDeclared());
     // A key that may change keeps this instance and all later ones of its class out of the namespace for now.
     fLayout->isHeld = fLayout->isHeld || fLayout->cls->GetLayout().GetDecl(target.slot).IsKey();
+}
+
+/// The last value would be that of all instances. So if two instances give different ones, what the document says of one is lost.
+void TCimXmlInstanceBuilder::SetStatic(const TCimXmlTarget& target, const TCIMValue& value)
+{
+    TInMemPropertyDecl& decl = *fLayout->cls->GetLayout().GetSharedDecl(target.slot);
+    TInMemStaticProperty& property = decl.GetStaticProperty();
+    const TCIMValue before = property.GetValue();
+    property.SetValue(value);
+    if (!fGivenStatics.insert(&decl).second && property.GetValue() != before) {
+        fContext.Fail(EStatus::kParseError, "found " + Show(value) + " in the static property " + Quote(*target.name) +
+                                                " of class " + Quote(fLayout->cls->GetName()) + ", which has " + Show(before) +
+                                                " in another instance; all instances share one value");
+    }
 }
 
 /// Writers do not always use the declared type: another one is accepted if the declared type can hold the value exactly.
@@ -149,7 +176,7 @@ void TCimXmlInstanceBuilder::FillKeys(const TOwnKeys& keys)
         Localize(converted);  // the name was read before classes in front of it were declared
         const bool mayRefer =
             TValueAccess::GetForm(converted) == TValueAccess::kPath || TValueAccess::GetForm(converted) == TValueAccess::kObject;
-        SetProperty({&decl.GetName(), slot, decl.GetType(), false}, std::move(converted), mayRefer);
+        SetProperty({&decl.GetName(), slot, decl.GetType(), false, decl.IsStatic()}, std::move(converted), mayRefer);
         fContext.Tolerate("key from name", "an instance of class " + Quote(fLayout->cls->GetName()) + " leaves out its key " +
                                                Quote(name) + "; taken from the name in front of it");
     }

@@ -5,6 +5,7 @@
 #include <cstddef>
 #include <cstdint>
 #include <memory>
+#include <set>
 #include <string>
 #include <utility>
 #include <vector>
@@ -37,7 +38,8 @@ class TCimXmlInstanceBuilder {
     /// Errors: kNotFound (15) if the class has no such property, kParseError (9) if the instance has had it already.
     TCimXmlTarget FindProperty(const char* name);
     /// `isUnsettled` says that references in the value may have to be written again (see TCimXmlPathReader::TakeMetUnsettled). A
-    /// value of another type is converted. Errors: kTypeMismatch (13) if that would lose something.
+    /// value of another type is converted. Errors: kTypeMismatch (13) if that would lose something; kParseError (9) if the property
+    /// is static and another instance has given it another value.
     void SetProperty(const TCimXmlTarget& target, TCIMValue&& value, bool isUnsettled);
     /// Begins the instance and sets all its properties. Call it for a draft when the document has ended. Errors: kNotFound (15) if
     /// its class is not declared; those of FindProperty and SetProperty.
@@ -50,6 +52,7 @@ class TCimXmlInstanceBuilder {
 
   private:
     TCimXmlLayout* FindLayout(const char* className);
+    void SetStatic(const TCimXmlTarget& target, const TCIMValue& value);
     TCIMValue Convert(const TCimXmlTarget& target, const TCIMValue& value);
     bool Localize(TCIMValue& value) const;
     void FillKeys(const TOwnKeys& keys);
@@ -62,8 +65,9 @@ class TCimXmlInstanceBuilder {
     TNameMap<std::unique_ptr<TCimXmlLayout>> fLayouts;  // by class name
     TCimXmlLayout* fLayout = nullptr;                   // of the instance being filled, or of the last one
     boost::shared_ptr<TInMemInstance> fInstance;
-    std::uint32_t fNumber = 0;  // of the instance, from 1
-    std::size_t fExpected = 0;  // the position of the property that is likely to come next
+    std::set<const TInMemPropertyDecl*> fGivenStatics;  // those that an instance has given a value, or NULL
+    std::uint32_t fNumber = 0;                          // of the instance, from 1
+    std::size_t fExpected = 0;                          // the position of the property that is likely to come next
 };
 
 }  // namespace NORVZEL20

@@ -326,8 +326,8 @@ void TCimXmlReader::EndProperty()
     if (!fIsDirect) {
         return fDraft.EndProperty(fProperty.Take());
     }
-    // A new instance has nulls already.
-    if (!fProperty.IsNull()) {
+    // A new instance has nulls already, apart from what it shares with others.
+    if (!fProperty.IsNull() || fTarget.isStatic) {
         fLoader->SetProperty(fTarget, fProperty.Take(), fPaths.TakeMetUnsettled());
     }
 }

@@ -88,7 +88,7 @@ class TCimXmlReader : public TXmlReader::ISink {
     TCimXmlItem* fItem = &fProperty;  // what a value belongs to: the property, or the qualifier that is open
     std::vector<TOpen> fOpen;         // the open elements, outermost first
     std::string_view fText;           // between the last tag and this one
-    TCimXmlTarget fTarget{nullptr, 0, TType::kNone, false};
+    TCimXmlTarget fTarget{nullptr, 0, TType::kNone, false, false};
     bool fIsDirect = false;       // the instance is filled without a draft
     bool fIsObjectGiven = false;  // the VALUE.OBJECT that is open has had its class or instance
     boost::shared_ptr<const TEmbeddedObject> fObject;

@@ -13,6 +13,7 @@ struct TCimXmlTarget {
     std::uint32_t slot;
     TCIMValue::TCIMType type;
     bool isEmbedded;  ///< whether text may be an embedded object, as the declaration says
+    bool isStatic;    ///< whether all instances share the value
 };
 
 }  // namespace NORVZEL20

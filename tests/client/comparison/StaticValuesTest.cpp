@@ -91,6 +91,24 @@ TEST_F(StaticValuesTest, APropertyThatOneInventoryDoesNotDeclareIsNullThere)
     EXPECT_EQ(begin + "NULL -> old\n" + end + "a as in b: Disk.Firmware.\n", Compare(without, with));
 }
 
+/// Whatever instance comes first.
+TEST_F(StaticValuesTest, AnInventoryWithTwoValuesIsRefused)
+{
+    const auto document = [](const std::string& first, const std::string& second) {
+        return Document(System() + Class("Disk", "", KeyProperty("Id") + Declaration("Firmware", "string", Qualifier("Static"))) +
+                        Instance("Disk", Value("Id", first) + Value("Firmware", first)) +
+                        Instance("Disk", Value("Id", second) + Value("Firmware", second)));
+    };
+    EXPECT_EQ(
+        "cimdelta: a.xml:6:159: found \"2\" in the static property \"Firmware\" of class \"Disk\", which has \"1\" in another "
+        "instance; all instances share one value\n",
+        Compare(document("1", "2"), Disks("1")));
+    EXPECT_EQ(
+        "cimdelta: a.xml:6:159: found \"1\" in the static property \"Firmware\" of class \"Disk\", which has \"2\" in another "
+        "instance; all instances share one value\n",
+        Compare(document("2", "1"), Disks("1")));
+}
+
 TEST_F(StaticValuesTest, SoDoesEveryInstanceOfThree)
 {
     const std::string old = Scratch("a.xml", Disks("old"));

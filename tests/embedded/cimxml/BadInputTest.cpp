@@ -136,6 +136,47 @@ TEST(BadInputTest, APropertyHasOneValue)
     }
 }
 
+/// Instances in front of their class are read in another way.
+TEST(BadInputTest, AStaticPropertyHasOneValue)
+{
+    const std::string mark = "<QUALIFIER NAME=\"Static\" TYPE=\"boolean\"><VALUE>TRUE</VALUE></QUALIFIER>";
+    const std::string base = L::Class("A", "<PROPERTY NAME=\"N\" TYPE=\"uint8\">" + mark + "<VALUE>1</VALUE></PROPERTY>" +
+                                               "<PROPERTY.ARRAY NAME=\"L\" TYPE=\"uint8\">" + mark + "</PROPERTY.ARRAY>");
+    const std::string below = "<VALUE.OBJECT><CLASS NAME=\"B\" SUPERCLASS=\"A\"/></VALUE.OBJECT>";
+    const std::string nothing = "<PROPERTY NAME=\"N\" TYPE=\"uint8\"/>";
+    const auto list = [](const std::string& first, const std::string& second) {
+        return "<PROPERTY.ARRAY NAME=\"L\" TYPE=\"uint8\"><VALUE.ARRAY><VALUE>" + first + "</VALUE><VALUE>" + second +
+               "</VALUE></VALUE.ARRAY></PROPERTY.ARRAY>";
+    };
+    const auto message = [](const std::string& value, const std::string& property, const std::string& other) {
+        return "found " + value + " in the static property \"" + property + "\" of class \"B\", which has " + other +
+               " in another instance; all instances share one value";
+    };
+    const struct {
+        std::string first;
+        std::string second;
+        std::string message;
+    } rows[] = {
+        {L::Property("N", "uint8", "2"), L::Property("N", "uint8", "2"), ""},
+        {L::Property("N", "uint8", "2"), "", ""},
+        {"", L::Property("N", "uint8", "2"), ""},
+        {nothing, nothing, ""},
+        {list("1", "2"), list("2", "1"), ""},
+        {L::Property("N", "uint8", "1"), L::Property("N", "uint8", "2"), message("\"2\"", "N", "\"1\"")},
+        {L::Property("N", "uint8", "2"), L::Property("N", "uint8", "1"), message("\"1\"", "N", "\"2\"")},
+        {L::Property("N", "uint8", "2"), nothing, message("NULL", "N", "\"2\"")},
+        {nothing, L::Property("N", "uint8", "1"), message("\"1\"", "N", "NULL")},
+        {list("1", "2"), list("2", "2"), message("\"{2, 2}\"", "L", "\"{1, 2}\"")},
+    };
+    for (const auto& row : rows) {
+        const std::string instances = L::Instance("A", "1", row.first) + L::Instance("B", "2", row.second);
+        for (const std::string& document : {base + below + instances, instances + base + below}) {
+            const std::string error = TLoading().ErrorOf(L::Group(document));
+            EXPECT_EQ(row.message, error.empty() ? error : error.substr(error.find(": ") + 2)) << document;
+        }
+    }
+}
+
 TEST(BadInputTest, AMissingFileIsReportedByItsName)
 {
     TLoading loading;
