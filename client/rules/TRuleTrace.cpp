@@ -80,14 +80,20 @@ TRuleTrace::TDecision TRuleTrace::Decide(const std::string& className, const std
 std::vector<std::string> TRuleTrace::FindReducedReferences(const ICIMClass& cls) const
 {
     const std::string& className = cls.GetName(TCallContext());
+    const std::vector<std::string> excluded = Find(className).excludedKeys;
     std::vector<std::string> names;
-    if (Find(className).excludedKeys.empty()) {
+    if (excluded.empty()) {
         return names;
     }
+    const std::vector<std::string> keys = KeyNamesOf(cls);
+    const auto has = [](const std::vector<std::string>& list, const std::string& name) {
+        return std::find(list.begin(), list.end(), name) != list.end();
+    };
     const auto enumerate = [&cls](const auto& callback) { cls.EnumeratePropertyDecls(callback, TCallContext()); };
     for (const boost::shared_ptr<ICIMPropertyDecl>& decl : Collect<ICIMPropertyDecl>(enumerate)) {
         const std::string& name = decl->GetName(TCallContext());
-        if (decl->GetType(TCallContext()) == TCIMValue::TCIMType::kReference &&
+        const bool isMatched = has(keys, name) && !has(excluded, name);
+        if (decl->GetType(TCallContext()) == TCIMValue::TCIMType::kReference && !isMatched &&
             Decide(className, name).treatment == TCIMDiffEngine::INCLUDE) {
             names.push_back(name);
         }

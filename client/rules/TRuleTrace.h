@@ -49,7 +49,8 @@ class TRuleTrace {
     TDecision Decide(const std::string& className, const std::string& property) const;
 
     /// The reference properties of the class that are compared although keys are excluded. The plug-in leaves the excluded keys of
-    /// a class out of all references that its instances hold, whatever class they refer to, and the namespace too.
+    /// a class out of all references that its instances hold, whatever class they refer to, and the namespace too. It does not do so
+    /// with a key that is not excluded: instances are matched by the whole reference.
     std::vector<std::string> FindReducedReferences(const ICIMClass& cls) const;
 
     /// The excluded keys of the class that references can lose, in the order of the rules: the keys of declared classes, and those

@@ -74,6 +74,39 @@ TEST_F(ReducedReferencesTest, CheckIsSilentIfNoReferenceIsCompared)
                            "</class><class name='NetworkMount' default='exclude'/>"));
 }
 
+/// As a comparison does it: instances do not match if a key that is a reference differs in an excluded key.
+TEST_F(ReducedReferencesTest, AKeyThatIsAReferenceIsMatchedWhole)
+{
+    const auto inventory = [](const std::string& boot) {
+        const std::string name = "<INSTANCENAME CLASSNAME=\"Host\"><KEYBINDING NAME=\"Name\"><KEYVALUE>n</KEYVALUE></KEYBINDING>"
+                                 "<KEYBINDING NAME=\"Boot\"><KEYVALUE>" +
+                                 boot + "</KEYVALUE></KEYBINDING></INSTANCENAME>";
+        return Document(System() + Class("Host", "", KeyProperty("Name") + KeyProperty("Boot")) +
+                        Class("Link", "", "<PROPERTY.REFERENCE NAME=\"A\">" + Qualifier("Key") + "</PROPERTY.REFERENCE>") +
+                        Class("FreeLink", "Link", "<PROPERTY.REFERENCE NAME=\"B\"/>") + Instance("Link", Reference("A", name)));
+    };
+    const std::string a = Scratch("a.xml", inventory("1"));
+    const std::string b = Scratch("b.xml", inventory("2"));
+    const auto ask = [&](const std::string& keys) {
+        const std::string rules =
+            Scratch("rules", "<DifftoolSpec><class name='Link' default='include' excludekeys='" + keys + "'/></DifftoolSpec>");
+        const std::string listing = Result({"check", rules, "--schema", a});
+        const std::string explained = Shorten(Result({"explain", "Link.A", "--spec", rules, "--schema", a}), rules, "R");
+        const std::string warning = listing.substr(std::min(listing.size(), listing.find("those in ")));
+        Run({"compare", "--spec", rules, a, b});
+        return warning.substr(0, warning.find('\n') + 1) + explained + fOut.substr(0, fOut.find(" between "));
+    };
+    EXPECT_EQ("those in FreeLink.B are compared without key Boot and without their namespace\n"
+              "Link.A: compared, by default, R:1 (element for class Link)\n"
+              "2 differences",
+              ask("Boot"));
+    EXPECT_EQ("those in Link.A, FreeLink.A, FreeLink.B are compared without keys A, Boot and without their namespace\n"
+              "Link.A: compared, by default, R:1 (element for class Link); references without keys A, Boot and without their "
+              "namespace (excludekeys, R:1)\n"
+              "No differences in what was compared",
+              ask("A Boot"));
+}
+
 TEST_F(ReducedReferencesTest, CheckShowsThemInTheEffectiveRules)
 {
     const std::string listing = Ask("check", "", "<class name='Mount' default='include' excludekeys='Point'/>");
