@@ -4,7 +4,8 @@
 // of their namespace or host differs. Which namespace that is, the document may say itself, before its first object, in the middle
 // or never; and it may name the namespace without the host. What it does not say follows from its references:
 //
-//     namespace   the one that all of them name, otherwise root/cimv2
+//     namespace   the one that all of them name, otherwise root/cimv2. If some name one and others none, it is a foreign one: who
+//                 leaves the own namespace out of one reference leaves it out of all
 //     host        the one that all of those name which name one beside that namespace; if they name several, none is known to be
 //                 the own one, and all stay in the paths
 //
@@ -19,6 +20,10 @@ namespace NORVZEL20 {
 
 TCimXmlOwnPlace::EAnswer TCimXmlOwnPlace::Classify(const std::string& name, const std::string& host)
 {
+    if (name.empty()) {
+        fIsNameless = true;
+        return kForeign;
+    }
     // What the document has named itself does not change any more.
     if (fIsDecided || (fReport.namesNamespace && (host.empty() || !fReport.host.empty()))) {
         return GetNamed().Contains(name, host) ? kOwn : kForeign;
@@ -54,7 +59,7 @@ bool TCimXmlOwnPlace::MakePathLocal(TCIMValue& value, bool& isOpen)
         }
         return true;
     });
-    const EAnswer answer = path.GetNamespaceName().empty() ? kForeign : Classify(path.GetNamespaceName(), path.GetHost());
+    const EAnswer answer = Classify(path.GetNamespaceName(), path.GetHost());
     if (answer == kOwn) {
         local.SetNamespaceName("");
         local.SetHost("");
@@ -70,7 +75,7 @@ bool TCimXmlOwnPlace::MakePathLocal(TCIMValue& value, bool& isOpen)
 void TCimXmlOwnPlace::Decide()
 {
     fReport.referencesNameNamespace = HasOpen();
-    if (!fReport.namesNamespace && fNamed.size() == 1) {
+    if (!fReport.namesNamespace && fNamed.size() == 1 && !fIsNameless) {
         fReport.namespaceName = fNamed.begin()->first;
     }
     const auto own = fNamed.find(fReport.namespaceName);

@@ -26,7 +26,8 @@ class CIMDELTA_INTERNAL_EXPORT TCimXmlOwnPlace {
     /// `report` says what the document names for itself so far. It must outlive this.
     explicit TCimXmlOwnPlace(TLoadReport& report) noexcept : fReport(report) {}
 
-    /// Whose a path with that namespace (not empty) and host (may be empty) is. Notes both for Decide if the answer is open.
+    /// Whose a path with that namespace and host (both may be empty) is. Notes what Decide needs. A path without a namespace is
+    /// kForeign, since there is nothing to take out of it.
     EAnswer Classify(const std::string& name, const std::string& host);
     /// Takes the own namespace and host out of the references in `value`, out of those in their keys, in arrays and in embedded
     /// objects. Returns whether one of them is open.
@@ -50,7 +51,8 @@ class CIMDELTA_INTERNAL_EXPORT TCimXmlOwnPlace {
     bool MakePathLocal(TCIMValue& value, bool& isOpen);
 
     TLoadReport& fReport;
-    TNameMap<THosts> fNamed;  // by namespace
+    TNameMap<THosts> fNamed;   // by namespace
+    bool fIsNameless = false;  // a reference names no namespace
     bool fIsDecided = false;
     bool fIsAnyHostOwn = false;  // the references name one host at most, and the document names none
 };

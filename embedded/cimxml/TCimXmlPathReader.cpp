@@ -110,11 +110,8 @@ TCIMReference TCimXmlPathReader::End()
 /// Gives the path the namespace and host that it is written with, unless they are the document's own.
 void TCimXmlPathReader::SetPlace(TCIMReference& path, const TFrame& frame)
 {
-    if (frame.namespaceName.empty()) {
-        return;
-    }
     const TCimXmlOwnPlace::EAnswer answer = fContext.GetOwnPlace().Classify(frame.namespaceName, frame.host);
-    if (answer != TCimXmlOwnPlace::kOwn) {
+    if (answer != TCimXmlOwnPlace::kOwn && !frame.namespaceName.empty()) {
         path.SetNamespaceName(frame.namespaceName);
         path.SetHost(frame.host);
     }
