@@ -55,8 +55,11 @@ TCause FindSystemTrouble(const std::vector<TInventory>& inventories)
     if (systems->GetInstanceCount() == 0) {
         return {inventories[0].path + " has no instance of " + kOperatingSystemClass, TFaultSearch::kCompleted};
     }
+    // The plug-in gives the same status to everything that goes wrong here, a lack of memory included.
     if (HasUsableType(*systems)) {
-        return {};
+        return {std::string("each inventory has its ") + kOperatingSystemClass +
+                    ", but reading them failed; perhaps there was not enough memory",
+                ""};
     }
     return {"the first " + std::string(kOperatingSystemClass) + " of " + inventories[0].path + " has no " + kOperatingSystemType +
                 " between 0 and 65535" + DescribeUnusableType(*systems),
