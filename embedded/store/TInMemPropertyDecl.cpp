@@ -9,16 +9,42 @@
 #include "embedded/store/TInMemPropertyDecl.h"
 
 #include <algorithm>
+#include <utility>
+#include <vector>
 
 #include "embedded/store/InMemClassChecks.h"
 #include "embedded/store/TInMemClass.h"
 #include "embedded/store/TInMemInstance.h"
 #include "embedded/store/TStoreRefusal.h"
+#include "embedded/value/ChangeReferences.h"
 #include "embedded/value/TNameText.h"
 #include "host/TCIMReference.h"
 #include "host/TZELException.h"
 
 namespace NORVZEL20 {
+
+namespace {
+
+/// Puts stubs in the place of the classes that a reference holds: its own, and those of the references in its keys.
+bool RemoveClasses(TCIMValue& value)
+{
+    TCIMReference path = value;
+    std::vector<std::pair<std::string, TCIMValue>> changedKeys;
+    path.EnumerateKeyBindings([&changedKeys](std::pair<std::string, TCIMValue> key) {
+        if (ChangeReferences(key.second, &RemoveClasses)) {
+            changedKeys.push_back(std::move(key));
+        }
+        return true;
+    });
+    for (const auto& [name, key] : changedKeys) {
+        path.AddKeyValue(name, key);
+    }
+    path.SetClassName(std::string(path.GetClassName()));
+    value = TCIMValue(path);
+    return true;
+}
+
+}  // namespace
 
 TInMemPropertyDecl::TInMemPropertyDecl(const std::string& name, const TCIMValue& value)
     : fName(name), fDefault(WithoutClasses(value)), fStaticProperty(*this)
@@ -88,23 +114,8 @@ TCIMValue TInMemPropertyDecl::Fit(TCIMValue value, const TInMemInstance* holder)
 
 TCIMValue TInMemPropertyDecl::WithoutClasses(TCIMValue value)
 {
-    if (value.IsNull()) {
-        return value;
-    }
-    if (value.GetType() == TCIMValue::TCIMType::kReference) {
-        TCIMReference path = value;
-        path.SetClassName(std::string(path.GetClassName()));
-        return TCIMValue(path);
-    }
-    if (value.GetType() != TCIMValue::TCIMType::kArrayReference) {
-        return value;
-    }
-    std::vector<TCIMValue> elements;
-    for (const TCIMValue& element : value.GetElements()) {
-        elements.push_back(WithoutClasses(element));
-    }
-    const TCIMValue copy(value.GetType(), static_cast<unsigned>(elements.size()), elements);
-    return value.IsBag() ? copy.AsBag() : copy;
+    ChangeReferences(value, &RemoveClasses);
+    return value;
 }
 
 void TInMemPropertyDecl::RewriteDefault(const TCIMValue& value)

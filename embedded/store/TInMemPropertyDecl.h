@@ -53,8 +53,8 @@ class CIMDELTA_EXPORT TInMemPropertyDecl : public TInMemNamedElement<ICIMPropert
     /// TStoreRefusal names the property and `holder`, whose property it is, or for null the declaring class.
     TCIMValue Fit(TCIMValue value, const TInMemInstance* holder = nullptr) const;
 
-    /// The value with a stub in the place of each class that a reference in it holds. A class owns its declarations; if a value in
-    /// one of them owned the class, neither would ever be released.
+    /// The value with a stub in the place of each class that a reference in it holds, in keys, elements and embedded objects too. A
+    /// class owns its declarations; if a value in one of them owned the class, neither would ever be released.
     static TCIMValue WithoutClasses(TCIMValue value);
 
     /// Writes the default another way, such as a reference without its namespace. A static property that still has the default gets

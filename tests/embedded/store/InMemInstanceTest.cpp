@@ -1,5 +1,7 @@
 #include "tests/embedded/store/TInMemFixture.h"
 
+#include <functional>
+
 #include "embedded/value/TEmbeddedObject.h"
 
 namespace NORVZEL20 {
@@ -269,6 +271,41 @@ TEST_F(InMemInstanceTest, ANamespaceWithReferencesIntoItselfIsDestroyed)
     EXPECT_TRUE(watchedTarget.expired());
     EXPECT_TRUE(watchedNamespace.expired());
     EXPECT_TRUE(watchedClass.expired());
+}
+
+TEST_F(InMemInstanceTest, AStaticValueDoesNotKeepItsClassAliveThroughKeysOfKeys)
+{
+    const std::vector<std::pair<TType::ECIMType, std::function<TCIMValue(const TCIMValue&)>>> places{
+        {TType::kReference, [](const TCIMValue& path) { return path; }},
+        {TType::kArrayReference,
+         [](const TCIMValue& path) { return TCIMValue(TType::kReference, 1, std::vector<TCIMValue>{path}); }},
+        {TType::kString,
+         [](const TCIMValue& path) {
+             const auto object = boost::make_shared<TEmbeddedObject>("Use");
+             object->AddProperty({"Of", path, "", 0, "", false, {}});
+             return TCIMValue(boost::shared_ptr<const TEmbeddedObject>(object));
+         }},
+    };
+    std::vector<boost::weak_ptr<TInMemClass>> watched;
+    for (const auto& [type, place] : places) {
+        SCOPED_TRACE(static_cast<int>(type));
+        const auto ns = TInMemNamespace::Create("root/hw");
+        auto part = ns->AllocateInMemClass("Part", nullptr);
+        part->AddPropertyDecl(Decl({"Name", TType::kString, {"Key"}}));
+        part->AddPropertyDecl(Decl({"Default", type, {"Static"}}));
+        part->AddToNamespace(kNoContext);
+        auto link = ns->AllocateInMemClass("Link", nullptr);
+        link->AddPropertyDecl(Reference("To", "Part"));
+        link->AddToNamespace(kNoContext);
+        const TCIMReference target = Add(part, {{"Name", "p1"}})->GetReference();
+        const TCIMReference path = Add(link, {{"To", TCIMValue(target)}})->GetReference();
+        part->SetPropertyValue("Default", place(TCIMValue(path)), kNoContext);
+        EXPECT_EQ(place(TCIMValue(path)), part->GetProperty("Default", kNoContext)->GetValue(kNoContext));
+        watched.push_back(part);
+    }
+    for (const boost::weak_ptr<TInMemClass>& part : watched) {
+        EXPECT_TRUE(part.expired());
+    }
 }
 
 TEST_F(InMemInstanceTest, AStaticPropertyIsMarkedForAllInstances)
