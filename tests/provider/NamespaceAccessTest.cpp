@@ -188,15 +188,24 @@ TEST(UnownedNamespaceTest, ANamespaceThatNobodyOwnsCannotWrap)
     EXPECT_EQ("KALMO_Delta", delta.GetClass("KALMO_Delta", context)->GetName(kNoContext));
 }
 
-TEST(RootTest, TheRootIsThatOfTheStoreWhateverTheIndex)
+/// A prepared comparison of namespaces of which the first declares a class Disk.
+class OneDiskTest : public testing::Test {
+  protected:
+    OneDiskTest()
+    {
+        fComparison.Namespace(0).Class("Disk", "", {TNamespaceBuilder::Key("Id")});
+        fComparison.Prepare();
+        fFirst["nsIndex"] = TCIMValue(static_cast<unsigned short>(0));
+    }
+
+    TComparisonRun fComparison{EHost::kInmem};
+    TCallContext fFirst;
+};
+
+TEST_F(OneDiskTest, TheRootIsThatOfTheStoreWhateverTheIndex)
 {
-    TComparisonRun comparison(EHost::kInmem);
-    comparison.Namespace(0).Class("Disk", "", {TNamespaceBuilder::Key("Id")});
-    comparison.Prepare();
-    TCallContext context;
-    context["nsIndex"] = TCIMValue(static_cast<unsigned short>(0));
-    for (const TCallContext& each : {TCallContext(), context}) {
-        const auto root = comparison.Delta().GetClass("<root>", each);
+    for (const TCallContext& each : {TCallContext(), fFirst}) {
+        const auto root = fComparison.Delta().GetClass("<root>", each);
         EXPECT_EQ(nullptr, boost::dynamic_pointer_cast<TDeltaClass>(root));
         std::string names;
         const auto collect = [&names](boost::shared_ptr<ICIMClass> cls) { return names += cls->GetName(kNoContext) + " ", true; };
@@ -205,18 +214,13 @@ TEST(RootTest, TheRootIsThatOfTheStoreWhateverTheIndex)
     }
 }
 
-TEST(SpellingTest, TwoSpellingsGiveTwoWrappersOfOneClass)
+TEST_F(OneDiskTest, TwoSpellingsGiveTwoWrappersOfOneClass)
 {
-    TComparisonRun comparison(EHost::kInmem);
-    comparison.Namespace(0).Class("Disk", "", {TNamespaceBuilder::Key("Id")});
-    comparison.Prepare();
-    TCallContext context;
-    context["nsIndex"] = TCIMValue(static_cast<unsigned short>(0));
-    const auto declared = comparison.Delta().GetClass("Disk", context);
-    const auto shouted = comparison.Delta().GetClass("DISK", context);
+    const auto declared = fComparison.Delta().GetClass("Disk", fFirst);
+    const auto shouted = fComparison.Delta().GetClass("DISK", fFirst);
     EXPECT_NE(declared, shouted);
     EXPECT_EQ("Disk", shouted->GetName(kNoContext));
-    EXPECT_EQ(2u, TTestAccess::ClassCache(comparison.Delta())[0].size());
+    EXPECT_EQ(2u, TTestAccess::ClassCache(fComparison.Delta())[0].size());
 }
 
 }  // namespace
