@@ -1,8 +1,7 @@
 // Reading the command line with CLI11, and the one place that turns failures into an exit status.
 //
-// Each command has a record of its arguments, which CLI11 fills while it parses, and a callback, which only notes the function to
-// run. The command runs after parsing, so an exception of the command cannot be taken for a mistake in the arguments. Before it
-// reads anything, its files are checked. Every failure arrives in RunClient: it becomes one message and kExitTrouble (2).
+// The commands and their options are in TCommands. Every failure arrives in RunClient: it becomes one message and
+// kExitTrouble (2).
 //
 // CLI11 reports a misspelt option as one argument too many, or as the lack of another one that is required. So whatever it reports,
 // the arguments that it did not take are searched for an unknown option first.
@@ -11,53 +10,21 @@
 
 #include <CLI/CLI.hpp>
 #include <algorithm>
-#include <boost/algorithm/string/join.hpp>
 #include <exception>
-#include <functional>
-#include <memory>
 #include <sstream>
 
+#include "client/BracketGuard.h"
+#include "client/TCommands.h"
 #include "client/WrongUsage.h"
-#include "client/commands/CheckCommand.h"
-#include "client/commands/CompareCommand.h"
-#include "client/commands/ExplainCommand.h"
-#include "client/commands/PrepareFiles.h"
-#include "client/commands/QueryCommand.h"
-#include "client/commands/ShowCommand.h"
 #include "client/process/ExitStatus.h"
 #include "client/process/LackOfMemory.h"
 #include "client/process/TReaderGone.h"
-#include "client/report/OutputFormats.h"
+#include "client/text/Alternatives.h"
 #include "client/text/NearestWord.h"
 
 namespace NORVZEL20 {
 
 namespace {
-
-const char kInventoryHelp[] = "CIM-XML, plain or compressed with gzip, xz or zstd; - is standard input";
-
-// CLI11 takes an argument in brackets, such as the file name [a,b], for a list and splits it. It leaves an argument alone that
-// begins with this character; Unguard removes the character before anything else sees the argument.
-const char kGuard = '\x01';
-
-std::string Guard(const std::string& argument)
-{
-    return argument.size() > 1 && argument.front() == '[' && argument.back() == ']' ? kGuard + argument : argument;
-}
-
-std::string Unguard(std::string text)
-{
-    text.erase(std::remove(text.begin(), text.end(), kGuard), text.end());
-    return text;
-}
-
-// "text, json or cimxml"
-std::string Alternatives(std::vector<std::string> names)
-{
-    const std::string last = names.back();
-    names.pop_back();
-    return boost::algorithm::join(names, ", ") + " or " + last;
-}
 
 bool IsOption(const std::string& argument)
 {
@@ -69,7 +36,7 @@ std::string UnknownOption(const CLI::App& command)
 {
     for (const std::string& argument : command.remaining()) {
         if (IsOption(argument)) {
-            return Unguard(argument.substr(0, argument.find('=')));
+            return UnguardBrackets(argument.substr(0, argument.find('=')));
         }
     }
     return std::string();
@@ -86,43 +53,16 @@ std::vector<std::string> LongOptions(const CLI::App& command)
     return names;
 }
 
-std::string RefuseEmpty(const std::string& text)
-{
-    return text.empty() ? "must not be empty" : "";
-}
-
-// Names the options that a command cannot do without in its first line.
-class THelp : public CLI::Formatter {
-  public:
-    std::string make_usage(const CLI::App* command, std::string name) const override
-    {
-        std::string usage = CLI::Formatter::make_usage(command, name);
-        for (const CLI::Option* option : command->get_options()) {
-            if (option->get_required() && option->nonpositional()) {
-                usage.insert(usage.find(name) + name.size(), " " + option->get_name() + " " + option->get_option_text());
-            }
-        }
-        return usage;
-    }
-};
-
-// Declares the arguments of every command, parses a command line and runs the command that it names.
+// Parses a command line and runs the command that it names.
 class TCommandLine {
   public:
     TCommandLine()
     {
-        AddVersion(fApp);
         fApp.require_subcommand(1);
-        fApp.formatter(std::make_shared<THelp>());
         fApp.footer(
             "Exit status: 0 done (compare: no differences in what was compared), 1 differences, 2 error (compare: or nothing was\n"
             "compared).\n"
             "cimdelta help COMMAND describes one command.");
-        AddCompare();
-        AddCheck();
-        AddExplain();
-        AddQuery();
-        AddShow();
     }
 
     int Run(int argc, const char* const* argv, IConsole& console)
@@ -139,14 +79,14 @@ class TCommandLine {
         if (!wrong.empty()) {
             return Refuse(wrong, console);
         }
-        std::transform(arguments.begin(), arguments.end(), arguments.begin(), &Guard);
+        std::transform(arguments.begin(), arguments.end(), arguments.begin(), &GuardBrackets);
         std::reverse(arguments.begin(), arguments.end());  // CLI11 wants the last argument first
         try {
             fApp.parse(std::move(arguments));
         } catch (const CLI::ParseError& error) {
             return Answer(error, console);
         }
-        return fCommand(console);
+        return fCommands.RunChosen(console);
     }
 
   private:
@@ -155,8 +95,6 @@ class TCommandLine {
         console.Say("cimdelta: " + message);
         return kExitTrouble;
     }
-
-    static void AddVersion(CLI::App& app) { app.set_version_flag("--version", std::string("cimdelta ") + CIMDELTA_VERSION); }
 
     static bool IsHelpOption(const std::string& argument) { return argument == "--help" || argument == "-h"; }
 
@@ -230,148 +168,14 @@ class TCommandLine {
             return Refuse(wrong, console);
         }
         return Refuse(chosen.empty() ? "name a command: " + Alternatives(CommandNames()) + "; see cimdelta --help"
-                                     : Unguard(DescribeWrongUsage(error, fApp, *chosen[0])) + "; see cimdelta " +
+                                     : UnguardBrackets(DescribeWrongUsage(error, fApp, *chosen[0])) + "; see cimdelta " +
                                            chosen[0]->get_name() + " --help",
                       console);
     }
 
-    CLI::App* AddCommand(const char* name, const char* description, std::function<int(IConsole&)> run)
-    {
-        CLI::App* command = fApp.add_subcommand(name, description);
-        AddVersion(*command);
-        // The callback only notes the function, which runs when the whole command line has been accepted.
-        command->callback([this, run] { fCommand = run; });
-        return command;
-    }
-
-    template <class TTarget>
-    static CLI::Option* AddText(CLI::App* command, const char* name, TTarget& target, const char* description)
-    {
-        return command->add_option(name, target, description)->transform(&Unguard)->check(&RefuseEmpty);
-    }
-
-    static void AddFormat(CLI::App* command, EOutputFormat& format)
-    {
-        const std::function<void(const std::string&)> set = [&format](const std::string& name) {
-            const std::vector<std::string> names = OutputFormatNames();
-            if (std::find(names.begin(), names.end(), name) == names.end()) {
-                throw CLI::ValidationError(name + " is no format; name one: " + Alternatives(names));
-            }
-            format = OutputFormatOf(name);
-        };
-        command->add_option_function("-o,--format", set, Alternatives(OutputFormatNames()) + " (default: text)")
-            ->transform(&Unguard)
-            ->check(&RefuseEmpty)
-            ->option_text("FORMAT");
-    }
-
-    static void AddOutput(CLI::App* command, std::string& output)
-    {
-        AddText(command, "--output", output, "write the result to this file, whole or not at all")->option_text("FILE");
-    }
-
-    static CLI::Option* AddSchemas(CLI::App* command, std::vector<std::string>& schemas)
-    {
-        return AddText(command, "--schema", schemas,
-                       "an inventory that the rules are for; repeat the option for several, the reference first")
-            // Otherwise the option would also take the arguments behind its value.
-            ->allow_extra_args(false)
-            ->option_text("INVENTORY");
-    }
-
-    static void AddStrictSchema(CLI::App* command, bool& strictSchema)
-    {
-        command->add_flag("--strict-schema", strictSchema,
-                          "take each inventory as it is: do not add declarations that only others have");
-    }
-
-    void AddCompare()
-    {
-        CLI::App* command =
-            AddCommand("compare", "show what differs between a reference and other inventories", [this](IConsole& console) {
-                std::vector<std::string> paths = fCompare.others;
-                paths.insert(paths.begin(), fCompare.reference);
-                paths = PrepareFiles({paths, fCompare.rules, fCompare.output}, 2, console);
-                fCompare.others.assign(paths.begin() + 1, paths.end());
-                return RunCompare(fCompare, console);
-            });
-        AddText(command, "REFERENCE", fCompare.reference, kInventoryHelp)->required()->option_text(" ");
-        AddText(command, "OTHER", fCompare.others, "the inventories to compare with the reference")->required()->option_text("...");
-        AddText(command, "--spec", fCompare.rules,
-                "a rules file that says what to compare, or - for standard input (default: everything)")
-            ->option_text("RULES");
-        AddFormat(command, fCompare.format);
-        AddOutput(command, fCompare.output);
-        AddStrictSchema(command, fCompare.strictSchema);
-        command->add_flag("--allow-empty", fCompare.allowEmpty, "do not take it for an error if nothing was compared");
-    }
-
-    void AddCheck()
-    {
-        CLI::App* command = AddCommand("check", "show what a rules file says, what follows from it and what may be a mistake",
-                                       [this](IConsole& console) {
-                                           fCheck.schemas = PrepareFiles({fCheck.schemas, fCheck.rules, fCheck.output}, 1, console);
-                                           return RunCheck(fCheck, console);
-                                       });
-        AddText(command, "RULES", fCheck.rules, "the rules file, or - for standard input")->required()->option_text(" ");
-        AddSchemas(command, fCheck.schemas);
-        AddStrictSchema(command, fCheck.strictSchema);
-        AddOutput(command, fCheck.output);
-    }
-
-    void AddExplain()
-    {
-        CLI::App* command =
-            AddCommand("explain", "show which rule decides how a class or a property is compared", [this](IConsole& console) {
-                fExplain.schemas = PrepareFiles({fExplain.schemas, fExplain.rules, fExplain.output}, 1, console);
-                return RunExplain(fExplain, console);
-            });
-        AddText(command, "ELEMENT", fExplain.element, "CLASS or CLASS.PROPERTY")->required()->option_text(" ");
-        AddText(command, "--spec", fExplain.rules, "a rules file, or - for standard input (default: everything is compared)")
-            ->option_text("RULES");
-        AddSchemas(command, fExplain.schemas)->required();
-        AddStrictSchema(command, fExplain.strictSchema);
-        AddOutput(command, fExplain.output);
-    }
-
-    void AddQuery()
-    {
-        CLI::App* command = AddCommand("query", "show the instances of an inventory that match a query", [this](IConsole& console) {
-            PrepareFiles({{fQuery.inventory}, std::string(), fQuery.output}, 1, console);
-            return RunQuery(fQuery, console);
-        });
-        AddText(command, "QUERY", fQuery.query, "WQL: SELECT * | name, ... FROM class [WHERE ...]")->required()->option_text(" ");
-        AddText(command, "INVENTORY", fQuery.inventory, kInventoryHelp)->required()->option_text(" ");
-        AddFormat(command, fQuery.format);
-        AddOutput(command, fQuery.output);
-    }
-
-    void AddShow()
-    {
-        CLI::App* command =
-            AddCommand("show", "show the classes of an inventory, or the instances of a class", [this](IConsole& console) {
-                PrepareFiles({{fShow.inventory}, std::string(), fShow.output}, 1, console);
-                return RunShow(fShow, console);
-            });
-        AddText(command, "INVENTORY", fShow.inventory, kInventoryHelp)->required()->option_text(" ");
-        AddText(command, "CLASS", fShow.className, "show the instances of this class and of the classes below it")
-            ->option_text(" ");
-        AddFormat(command, fShow.format);
-        AddOutput(command, fShow.output);
-    }
-
     CLI::App fApp{"Compares inventories held as CIM-XML and reports what differs.", "cimdelta"};
-    std::function<int(IConsole&)> fCommand;
-    TCompareOptions fCompare;
-    TCheckOptions fCheck;
-    TExplainOptions fExplain;
-    TQueryOptions fQuery;
-    TShowOptions fShow;
+    TCommands fCommands{fApp};
 };
-
-}  // namespace
-
-namespace {
 
 // If there is no memory to build the message, says that instead.
 void Complain(IConsole& console, const char* text) noexcept

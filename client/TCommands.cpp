@@ -1,0 +1,179 @@
+#include "client/TCommands.h"
+
+#include <algorithm>
+#include <memory>
+
+#include "client/BracketGuard.h"
+#include "client/commands/PrepareFiles.h"
+#include "client/report/OutputFormats.h"
+#include "client/text/Alternatives.h"
+
+namespace NORVZEL20 {
+
+namespace {
+
+const char kInventoryHelp[] = "CIM-XML, plain or compressed with gzip, xz or zstd; - is standard input";
+
+std::string RefuseEmpty(const std::string& text)
+{
+    return text.empty() ? "must not be empty" : "";
+}
+
+void AddVersion(CLI::App& app)
+{
+    app.set_version_flag("--version", std::string("cimdelta ") + CIMDELTA_VERSION);
+}
+
+template <class TTarget>
+CLI::Option* AddText(CLI::App* command, const char* name, TTarget& target, const char* description)
+{
+    return command->add_option(name, target, description)->transform(&UnguardBrackets)->check(&RefuseEmpty);
+}
+
+void AddFormat(CLI::App* command, EOutputFormat& format)
+{
+    const std::function<void(const std::string&)> set = [&format](const std::string& name) {
+        const std::vector<std::string> names = OutputFormatNames();
+        if (std::find(names.begin(), names.end(), name) == names.end()) {
+            throw CLI::ValidationError(name + " is no format; name one: " + Alternatives(names));
+        }
+        format = OutputFormatOf(name);
+    };
+    command->add_option_function("-o,--format", set, Alternatives(OutputFormatNames()) + " (default: text)")
+        ->transform(&UnguardBrackets)
+        ->check(&RefuseEmpty)
+        ->option_text("FORMAT");
+}
+
+void AddOutput(CLI::App* command, std::string& output)
+{
+    AddText(command, "--output", output, "write the result to this file, whole or not at all")->option_text("FILE");
+}
+
+CLI::Option* AddSchemas(CLI::App* command, std::vector<std::string>& schemas)
+{
+    return AddText(command, "--schema", schemas,
+                   "an inventory that the rules are for; repeat the option for several, the reference first")
+        // Otherwise the option would also take the arguments behind its value.
+        ->allow_extra_args(false)
+        ->option_text("INVENTORY");
+}
+
+void AddStrictSchema(CLI::App* command, bool& strictSchema)
+{
+    command->add_flag("--strict-schema", strictSchema,
+                      "take each inventory as it is: do not add declarations that only others have");
+}
+
+// Names the options that a command cannot do without in its first line.
+class THelp : public CLI::Formatter {
+  public:
+    std::string make_usage(const CLI::App* command, std::string name) const override
+    {
+        std::string usage = CLI::Formatter::make_usage(command, name);
+        for (const CLI::Option* option : command->get_options()) {
+            if (option->get_required() && option->nonpositional()) {
+                usage.insert(usage.find(name) + name.size(), " " + option->get_name() + " " + option->get_option_text());
+            }
+        }
+        return usage;
+    }
+};
+
+}  // namespace
+
+TCommands::TCommands(CLI::App& app) : fApp(app)
+{
+    app.formatter(std::make_shared<THelp>());  // before the commands, which inherit it
+    AddVersion(app);
+    AddCompare();
+    AddCheck();
+    AddExplain();
+    AddQuery();
+    AddShow();
+}
+
+CLI::App* TCommands::AddCommand(const char* name, const char* description, std::function<int(IConsole&)> run)
+{
+    CLI::App* command = fApp.add_subcommand(name, description);
+    AddVersion(*command);
+    // The callback only notes the function, which runs when the whole command line has been accepted.
+    command->callback([this, run] { fChosen = run; });
+    return command;
+}
+
+void TCommands::AddCompare()
+{
+    CLI::App* command =
+        AddCommand("compare", "show what differs between a reference and other inventories", [this](IConsole& console) {
+            std::vector<std::string> paths = fCompare.others;
+            paths.insert(paths.begin(), fCompare.reference);
+            paths = PrepareFiles({paths, fCompare.rules, fCompare.output}, 2, console);
+            fCompare.others.assign(paths.begin() + 1, paths.end());
+            return RunCompare(fCompare, console);
+        });
+    AddText(command, "REFERENCE", fCompare.reference, kInventoryHelp)->required()->option_text(" ");
+    AddText(command, "OTHER", fCompare.others, "the inventories to compare with the reference")->required()->option_text("...");
+    AddText(command, "--spec", fCompare.rules,
+            "a rules file that says what to compare, or - for standard input (default: everything)")
+        ->option_text("RULES");
+    AddFormat(command, fCompare.format);
+    AddOutput(command, fCompare.output);
+    AddStrictSchema(command, fCompare.strictSchema);
+    command->add_flag("--allow-empty", fCompare.allowEmpty, "do not take it for an error if nothing was compared");
+}
+
+void TCommands::AddCheck()
+{
+    CLI::App* command = AddCommand("check", "show what a rules file says, what follows from it and what may be a mistake",
+                                   [this](IConsole& console) {
+                                       fCheck.schemas = PrepareFiles({fCheck.schemas, fCheck.rules, fCheck.output}, 1, console);
+                                       return RunCheck(fCheck, console);
+                                   });
+    AddText(command, "RULES", fCheck.rules, "the rules file, or - for standard input")->required()->option_text(" ");
+    AddSchemas(command, fCheck.schemas);
+    AddStrictSchema(command, fCheck.strictSchema);
+    AddOutput(command, fCheck.output);
+}
+
+void TCommands::AddExplain()
+{
+    CLI::App* command =
+        AddCommand("explain", "show which rule decides how a class or a property is compared", [this](IConsole& console) {
+            fExplain.schemas = PrepareFiles({fExplain.schemas, fExplain.rules, fExplain.output}, 1, console);
+            return RunExplain(fExplain, console);
+        });
+    AddText(command, "ELEMENT", fExplain.element, "CLASS or CLASS.PROPERTY")->required()->option_text(" ");
+    AddText(command, "--spec", fExplain.rules, "a rules file, or - for standard input (default: everything is compared)")
+        ->option_text("RULES");
+    AddSchemas(command, fExplain.schemas)->required();
+    AddStrictSchema(command, fExplain.strictSchema);
+    AddOutput(command, fExplain.output);
+}
+
+void TCommands::AddQuery()
+{
+    CLI::App* command = AddCommand("query", "show the instances of an inventory that match a query", [this](IConsole& console) {
+        PrepareFiles({{fQuery.inventory}, std::string(), fQuery.output}, 1, console);
+        return RunQuery(fQuery, console);
+    });
+    AddText(command, "QUERY", fQuery.query, "WQL: SELECT * | name, ... FROM class [WHERE ...]")->required()->option_text(" ");
+    AddText(command, "INVENTORY", fQuery.inventory, kInventoryHelp)->required()->option_text(" ");
+    AddFormat(command, fQuery.format);
+    AddOutput(command, fQuery.output);
+}
+
+void TCommands::AddShow()
+{
+    CLI::App* command =
+        AddCommand("show", "show the classes of an inventory, or the instances of a class", [this](IConsole& console) {
+            PrepareFiles({{fShow.inventory}, std::string(), fShow.output}, 1, console);
+            return RunShow(fShow, console);
+        });
+    AddText(command, "INVENTORY", fShow.inventory, kInventoryHelp)->required()->option_text(" ");
+    AddText(command, "CLASS", fShow.className, "show the instances of this class and of the classes below it")->option_text(" ");
+    AddFormat(command, fShow.format);
+    AddOutput(command, fShow.output);
+}
+
+}  // namespace NORVZEL20
