@@ -11,18 +11,13 @@
 namespace NORVZEL20 {
 namespace {
 
-// Every comparison reads the type of the operating system first, so an inventory needs an instance of this class.
-std::string WithOperatingSystem(const std::string& xml)
+std::string Generate(unsigned int state)
 {
-    static const std::string kEnd = "</DECLGROUP>";
-    static const std::string kOperatingSystem =
-        "<VALUE.OBJECT><CLASS NAME=\"KALMO_OperatingSystem\"><PROPERTY NAME=\"Name\" TYPE=\"string\">"
-        "<QUALIFIER NAME=\"Key\" TYPE=\"boolean\"><VALUE>TRUE</VALUE></QUALIFIER></PROPERTY>"
-        "<PROPERTY NAME=\"OSType\" TYPE=\"uint16\"/></CLASS></VALUE.OBJECT>\n"
-        "<VALUE.OBJECT><INSTANCE CLASSNAME=\"KALMO_OperatingSystem\"><PROPERTY NAME=\"Name\" TYPE=\"string\"><VALUE>bench</VALUE>"
-        "</PROPERTY><PROPERTY NAME=\"OSType\" TYPE=\"uint16\"><VALUE>36</VALUE></PROPERTY></INSTANCE></VALUE.OBJECT>\n";
-    std::string result = xml;
-    return result.insert(result.rfind(kEnd), kOperatingSystem);
+    TInventoryShape shape;
+    shape.instances = kBenchInstances;
+    std::ostringstream out;
+    TInventoryGenerator(shape).Write(out, state);
+    return out.str();
 }
 
 // A temporary file with the rules, removed when the process ends.
@@ -47,21 +42,13 @@ struct TRulesFile {
 
 const std::string& FirstState()
 {
-    static const std::string xml = [] {
-        std::ostringstream out;
-        TInventoryGenerator(kBenchInstances).WriteFirstState(out);
-        return WithOperatingSystem(out.str());
-    }();
+    static const std::string xml = Generate(0);
     return xml;
 }
 
 const std::string& SecondState()
 {
-    static const std::string xml = [] {
-        std::ostringstream out;
-        TInventoryGenerator(kBenchInstances).WriteSecondState(out);
-        return WithOperatingSystem(out.str());
-    }();
+    static const std::string xml = Generate(1);
     return xml;
 }
 

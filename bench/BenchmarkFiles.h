@@ -7,7 +7,7 @@ namespace NORVZEL20 {
 /// The number of instances in each inventory of the benchmarks.
 constexpr unsigned int kBenchInstances = 100000;
 
-/// The two states of the generated inventory as CIM-XML, made on first use and kept in memory.
+/// Two states of the generated inventory of one class as CIM-XML, made on first use and kept in memory.
 const std::string& FirstState();
 const std::string& SecondState();
 

@@ -1,16 +1,18 @@
 // Generates the inventories of the benchmarks.
 //
-// Every value is a function of the seed, the number of its instance and its property: a hash of the three is the random number from
-// which the value is made. So no state is kept, instances can be written in any order, and equal arguments give equal bytes
-// everywhere.
+// Every value is a function of the number of its instance and its property: a hash of the two is the random number from which the
+// value is made. So no state is kept, instances can be written in any order, and equal arguments give equal bytes everywhere.
 //
-// The second state is written by the same functions. Another hash decides which values change (1 %), which instances are left out
-// (0.5 %) and after which ones a new instance follows (0.5 %).
+// The other states are written by the same functions. Another hash, which depends on the state, decides which values change, which
+// instances are left out (0.5 %) and which ones are followed by a new instance (0.5 %). The name of a new instance continues the
+// name of the one before it, so an inventory in key order stays in key order.
 
 #include "bench/TInventoryGenerator.h"
 
 #include <array>
 #include <cstdio>
+#include <numeric>
+#include <utility>
 
 namespace NORVZEL20 {
 namespace {
@@ -30,6 +32,9 @@ enum EProperty : unsigned int {
 };
 
 constexpr std::uint64_t kPerMille = 1000;
+constexpr std::uint64_t kMissingPerMille = 5;
+constexpr std::uint64_t kNewPerMille = 5;
+constexpr std::uint64_t kSeed = 1;
 
 // A hash whose output bits all depend on all input bits.
 std::uint64_t Mix(std::uint64_t value)
@@ -58,16 +63,17 @@ std::string Description(std::uint64_t random)
 {
     static const std::array<const char*, 8> kWords = {"network", "storage", "daemon",   "library",
                                                       "runtime", "support", "security", "console"};
-    return Format("%s %s for the %s %s", kWords[random & 7U], kWords[(random >> 3) & 7U], kWords[(random >> 6) & 7U],
-                  kWords[(random >> 9) & 7U]);
+    const auto word = [&](unsigned int place) { return kWords[(random >> (3 * place)) & 7U]; };
+    return Format("%s %s for the &quot;%s %s&quot; %s, with %s &amp; %s", word(0), word(1), word(2), word(3), word(4), word(5),
+                  word(6));
 }
 
-std::string Declaration()
+std::string Declaration(const std::string& name)
 {
-    std::string xml = "<CLASS NAME=\"BENCH_Software\">\n";
+    std::string xml = "<VALUE.OBJECT><CLASS NAME=\"" + name + "\">\n";
     const std::string key = "<QUALIFIER NAME=\"Key\" TYPE=\"boolean\"><VALUE>TRUE</VALUE></QUALIFIER>";
-    for (const char* name : {"CreationClassName", "Name"}) {
-        xml.append("<PROPERTY NAME=\"").append(name).append("\" TYPE=\"string\">").append(key).append("</PROPERTY>\n");
+    for (const char* property : {"CreationClassName", "Name"}) {
+        xml.append("<PROPERTY NAME=\"").append(property).append("\" TYPE=\"string\">").append(key).append("</PROPERTY>\n");
     }
     static const std::array<std::array<const char*, 2>, 11> kProperties = {{{"Version", "string"},
                                                                             {"Vendor", "string"},
@@ -83,32 +89,54 @@ std::string Declaration()
     for (const auto& property : kProperties) {
         xml.append("<PROPERTY NAME=\"").append(property[0]).append("\" TYPE=\"").append(property[1]).append("\"/>\n");
     }
-    return xml.append("</CLASS>\n");
+    return xml.append("</CLASS></VALUE.OBJECT>\n");
 }
 
 }  // namespace
 
-std::uint64_t TInventoryGenerator::Random(std::uint64_t number, unsigned int property, bool second) const
+std::vector<std::uint64_t> TInventoryGenerator::Order() const
 {
-    const std::uint64_t random = Mix(fSeed ^ Mix(number * 16 + property));
-    const bool changed = second && Mix(random) % kPerMille < 10;
-    return changed ? Mix(random + 1) : random;
+    std::vector<std::uint64_t> order(fShape.instances);
+    std::iota(order.begin(), order.end(), std::uint64_t{0});
+    for (std::size_t place = order.size(); fShape.shuffleSeed != 0 && place > 1; --place) {
+        std::swap(order[place - 1], order[Mix(Mix(fShape.shuffleSeed) + place) % place]);
+    }
+    return order;
 }
 
-void TInventoryGenerator::AppendInstance(std::string& xml, std::uint64_t number, bool second) const
+std::string TInventoryGenerator::ClassOf(std::uint64_t number) const
 {
-    const auto random = [&](EProperty property) { return static_cast<unsigned long long>(Random(number, property, second)); };
-    xml.append("<VALUE.OBJECT><INSTANCE CLASSNAME=\"BENCH_Software\">\n");
-    AppendProperty(xml, "CreationClassName", "string", "BENCH_Software");
-    AppendProperty(xml, "Name", "string", Format("package-%08llu", static_cast<unsigned long long>(number)));
+    if (fShape.classes == 1) {
+        return "BENCH_Software";
+    }
+    return Format("BENCH_Software%03llu", static_cast<unsigned long long>(number * fShape.classes / fShape.instances));
+}
+
+std::uint64_t TInventoryGenerator::Random(std::uint64_t number, unsigned int property, unsigned int state) const
+{
+    const std::uint64_t random = Mix(kSeed ^ Mix(number * 16 + property));
+    const bool changed = state != 0 && Mix(random + state - 1) % kPerMille < fShape.changedPerMille;
+    return changed ? Mix(random + state) : random;
+}
+
+void TInventoryGenerator::AppendInstance(std::string& xml, std::uint64_t number, unsigned int state, bool isNew) const
+{
+    const std::uint64_t source = isNew ? number + std::uint64_t{fShape.instances} * state : number;
+    const auto random = [&](EProperty property) { return static_cast<unsigned long long>(Random(source, property, state)); };
+    const std::string className = ClassOf(number);
+    xml.append("<VALUE.OBJECT><INSTANCE CLASSNAME=\"").append(className).append("\">\n");
+    AppendProperty(xml, "CreationClassName", "string", className);
+    const std::string name = Format("package-%08llu", static_cast<unsigned long long>(number));
+    AppendProperty(xml, "Name", "string", isNew ? name + Format(".%u", state) : name);
     const auto version = random(kVersion);
     AppendProperty(xml, "Version", "string",
                    Format("%llu.%llu.%llu-%llu", version % 10, version / 16 % 40, version / 1024 % 100, version / 131072 % 1000));
     AppendProperty(xml, "Vendor", "string", Format("Vendor %llu Incorporated", random(kVendor) % 200));
     AppendProperty(xml, "Description", "string", Description(random(kDescription)));
     AppendProperty(xml, "Path", "string",
-                   Format("/usr/lib/bench/%08llx/module-%04llu", random(kPath) & 0xffffffffU, random(kPath) >> 32 & 4095U));
-    AppendProperty(xml, "Checksum", "string", Format("%016llx%016llx", random(kChecksum), Mix(random(kChecksum))));
+                   Format("/usr/lib/bench/%08llx/module-%04llu.so", random(kPath) & 0xffffffffU, random(kPath) >> 32 & 4095U));
+    AppendProperty(xml, "Checksum", "string",
+                   Format("%016llx%016llx%08llx", random(kChecksum), Mix(random(kChecksum)), random(kChecksum) >> 32));
     AppendProperty(xml, "State", "uint16", Format("%llu", random(kState) % 12));
     AppendProperty(xml, "Size", "uint64", Format("%llu", random(kSize) % 5000000000U));
     AppendProperty(xml, "FileCount", "uint32", Format("%llu", random(kFileCount) % 20000));
@@ -121,20 +149,24 @@ void TInventoryGenerator::AppendInstance(std::string& xml, std::uint64_t number,
     xml.append("</INSTANCE></VALUE.OBJECT>\n");
 }
 
-void TInventoryGenerator::Write(std::ostream& out, bool second) const
+void TInventoryGenerator::Write(std::ostream& out, unsigned int state) const
 {
     out << "<?xml version=\"1.0\" encoding=\"utf-8\"?>\n<CIM CIMVERSION=\"2.0\" DTDVERSION=\"2.0\"><DECLARATION><DECLGROUP>\n"
         << "<QUALIFIER.DECLARATION NAME=\"Key\" TYPE=\"boolean\" OVERRIDABLE=\"false\"><SCOPE PROPERTY=\"true\" "
            "REFERENCE=\"true\"/>"
-        << "<VALUE>FALSE</VALUE></QUALIFIER.DECLARATION>\n<VALUE.OBJECT>" << Declaration() << "</VALUE.OBJECT>\n";
+        << "<VALUE>FALSE</VALUE></QUALIFIER.DECLARATION>\n";
+    for (std::uint64_t number = 0; number < fShape.classes; ++number) {
+        // The first instance of the class is the first whose share of all instances reaches that of the class.
+        out << Declaration(ClassOf((number * fShape.instances + fShape.classes - 1) / fShape.classes));
+    }
     std::string xml;
-    for (std::uint64_t number = 0; number < fInstances; ++number) {
-        const std::uint64_t fate = Mix(fSeed + Mix(number)) % kPerMille;
-        if (!second || fate >= 5) {
-            AppendInstance(xml, number, second);
+    for (const std::uint64_t number : Order()) {
+        const std::uint64_t fate = Mix(kSeed + state - 1 + Mix(number)) % kPerMille;
+        if (state == 0 || fate >= kMissingPerMille) {
+            AppendInstance(xml, number, state, false);
         }
-        if (second && fate >= 5 && fate < 10) {
-            AppendInstance(xml, fInstances + number, true);
+        if (state != 0 && fate >= kMissingPerMille && fate < kMissingPerMille + kNewPerMille) {
+            AppendInstance(xml, number, state, true);
         }
         out << xml;
         xml.clear();
