@@ -80,19 +80,20 @@ def show(run, recorded):
     for key, figure in run["figures"].items():
         last = recorded.last(key, run["sizes"])
         print(f"\n{figure['title']}" + (f"    (last recorded: {last['date']}, {last['label']})" if last else ""))
-        for measure_key, measure in figure["measures"].items():
-            print(f"  {measure['title']} ({measure['unit']})")
-            for name, (best, median) in measure["numbers"].items():
-                against = "  ".join(f"{ratio:.2f} x {other}" for other, ratio in results.ratios(measure["numbers"], name))
-                print(f"    {name:7} best {results.number(best):>8}  median {results.number(median):>8}  {last_of(last, key, measure_key, name):24}"
-                      f"{against if name in ('now', 'before') else ''}".rstrip())
+        for measure_key, numbers in figure["measures"].items():
+            print(f"  {numbers['title']} ({numbers['unit']})")
+            earlier = last["figures"][key]["measures"].get(measure_key, {}).get("numbers", {}) if last else {}
+            for name in numbers["numbers"]:
+                print(f"    {name:7} {shown(numbers['numbers'], name):52} {'last ' + shown(earlier, name) if name in earlier else ''}".rstrip())
         for name, reason in figure["over"].items():
             print(f"    {name:7} {reason}")
 
 
-def last_of(last, figure, measure, name):
-    numbers = last["figures"][figure]["measures"].get(measure, {}).get("numbers", {}).get(name) if last else None
-    return f"last {results.number(numbers[0])} / {results.number(numbers[1])}" if numbers else ""
+def shown(numbers, name):
+    """Best and median of a contender; for a build also its ratios to the others."""
+    best, median = numbers[name]
+    against = results.ratios(numbers, name) if name in ("now", "before") else []
+    return f"{results.number(best):>8} {results.number(median):>8}  " + ", ".join(f"{ratio:.2f} x {other}" for other, ratio in against)
 
 
 def measure(options, folder):
@@ -119,6 +120,7 @@ def main():
     except (Disagreement, counting.NotCountable, measuring.ProgramFailure) as fault:
         print(f"bench: {fault}", file=sys.stderr)
         return 2
+    print("best and median; for a build the ratios of medians")
     show(run, recorded)
     if options.record:
         recorded.add(run)
