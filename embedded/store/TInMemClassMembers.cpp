@@ -92,9 +92,9 @@ void TInMemClass::EnumeratePropertyDecls(const boost::function<bool(boost::share
 
 void TInMemClass::EnumerateKeyNames(const boost::function<bool(const std::string*)>& callback, TCallContext) const
 {
-    const std::vector<std::uint32_t> slots = fLayout.GetKeys();
-    for (const std::uint32_t slot : slots) {
-        if (!callback(&fLayout.GetDecl(slot).GetName())) {
+    // The loop goes by position, because the callback may change the class.
+    for (std::size_t at = 0; at < fLayout.GetKeys().size(); ++at) {
+        if (!callback(&fLayout.GetDecl(fLayout.GetKeys()[at]).GetName())) {
             return;
         }
     }

@@ -130,14 +130,13 @@ boost::shared_ptr<ICIMClass> TInMemInstance::GetClass(TCallContext) const
 }
 
 /// A static property lives in its declaration, any other one in the instance; the handle keeps that object alive.
-boost::shared_ptr<ICIMProperty> TInMemInstance::GetHandle(std::uint32_t slot,
-                                                          const boost::shared_ptr<const TInMemInstance>& self) const
+boost::shared_ptr<ICIMProperty> TInMemInstance::GetHandle(std::uint32_t slot, boost::shared_ptr<const TInMemInstance> self) const
 {
     const auto& decl = fClass->GetLayout().GetSharedDecl(slot);
     if (decl->IsStatic()) {
         return boost::shared_ptr<ICIMProperty>(decl, &decl->GetStaticProperty());
     }
-    return boost::shared_ptr<ICIMProperty>(self, &GetSlotProperty(slot));
+    return boost::shared_ptr<ICIMProperty>(std::move(self), &GetSlotProperty(slot));
 }
 
 boost::shared_ptr<ICIMProperty> TInMemInstance::GetProperty(const std::string& name, TCallContext) const

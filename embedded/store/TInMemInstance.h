@@ -76,7 +76,7 @@ class CIMDELTA_EXPORT TInMemInstance final : public ICIMInstance, public boost::
 
     TInMemInstance(boost::shared_ptr<TInMemClass> cls, std::uint32_t slots) noexcept;
     TInMemBlock& GetOwnBlock() const noexcept;
-    boost::shared_ptr<ICIMProperty> GetHandle(std::uint32_t slot, const boost::shared_ptr<const TInMemInstance>& self) const;
+    boost::shared_ptr<ICIMProperty> GetHandle(std::uint32_t slot, boost::shared_ptr<const TInMemInstance> self) const;
     TExtras& GetExtras() const;
     TInMemProperty& GetLateProperty(std::uint32_t slot) const;
     void SetAdded(std::uint32_t keyHash) noexcept;

@@ -25,6 +25,10 @@ TInMemLayout::TInMemLayout(const TInMemLayout* super) : fSuper(super)
 
 std::uint32_t TInMemLayout::FindSlot(std::string_view name) const noexcept
 {
+    const std::uint32_t likely = fLikelySlots.Guess(name);
+    if (likely != TLikelySlots::kNone && fSlots[likely]->GetName() == name) {
+        return likely;
+    }
     const auto isNamed = [&](std::uint32_t slot) { return TNameText::Equal(fSlots[slot]->GetName(), name); };
     return fSlotIndex.Find(TNameText::Hash(name), isNamed);
 }
@@ -130,6 +134,7 @@ void TInMemLayout::Resolve(std::string_view name)
         fSlots[slot] = decl;
     } else if (slot != kNoSlot) {
         fSlotIndex.Remove(TNameText::Hash(name), slot);
+        fLikelySlots.Remove(name, slot);
     }
 }
 
@@ -139,6 +144,7 @@ void TInMemLayout::Append(const boost::shared_ptr<TInMemPropertyDecl>& decl)
     fSlotIndex.Reserve(slot + static_cast<std::size_t>(1));
     fSlots.push_back(decl);
     fSlotIndex.Add(TNameText::Hash(decl->GetName()), slot);
+    fLikelySlots.Add(decl->GetName(), slot);
 }
 
 void TInMemLayout::Rearrange()

@@ -7,6 +7,7 @@
 
 #include "embedded/store/THashIndex.h"
 #include "embedded/store/TInMemPropertyDecl.h"
+#include "embedded/store/TLikelySlots.h"
 #include "host/Export.h"
 
 namespace NORVZEL20 {
@@ -70,6 +71,7 @@ class CIMDELTA_EXPORT TInMemLayout {
     std::vector<boost::shared_ptr<TInMemPropertyDecl>> fOwn;
     std::vector<boost::shared_ptr<TInMemPropertyDecl>> fSlots;  // that of a removed property keeps its declaration
     THashIndex fSlotIndex;                                      // slots by the names of their declarations
+    TLikelySlots fLikelySlots;                                  // the same, asked first
     std::vector<std::uint32_t> fOrder;
     std::vector<std::uint32_t> fKeys;
     std::uint32_t fVersion = 0;       // counts the changes of slots, order and keys

@@ -1,0 +1,92 @@
+#include "embedded/store/TLikelySlots.h"
+#include "tests/embedded/store/TDevicesFixture.h"
+
+namespace NORVZEL20 {
+namespace {
+
+TEST(LikelySlots, ASlotIsGuessedInAnyLetterCase)
+{
+    TLikelySlots slots;
+    EXPECT_EQ(TLikelySlots::kNone, slots.Guess("Size"));
+    slots.Add("Size", 3);
+    EXPECT_EQ(3u, slots.Guess("Size"));
+    EXPECT_EQ(3u, slots.Guess("sIZE"));
+    slots.Remove("SIZE", 3);
+    EXPECT_EQ(TLikelySlots::kNone, slots.Guess("Size"));
+}
+
+TEST(LikelySlots, TheLastOfSeveralNamesWithOneEntryIsGuessed)
+{
+    TLikelySlots slots;
+    slots.Add("Axxz", 1);
+    slots.Add("Ayxz", 2);  // differs in a character that does not count
+    EXPECT_EQ(2u, slots.Guess("Axxz"));
+    slots.Remove("Axxz", 1);
+    EXPECT_EQ(2u, slots.Guess("Ayxz"));
+    slots.Remove("Ayxz", 2);
+    EXPECT_EQ(TLikelySlots::kNone, slots.Guess("Axxz"));
+}
+
+TEST(LikelySlots, ASlotThatNeedsMoreThanAByteIsNotGuessed)
+{
+    TLikelySlots slots;
+    slots.Add("Size", 254);
+    slots.Add("Size", 255);
+    EXPECT_EQ(254u, slots.Guess("Size"));
+}
+
+TEST(LikelySlots, TheEmptyNameIsAName)
+{
+    TLikelySlots slots;
+    slots.Add("", 0);
+    EXPECT_EQ(0u, slots.Guess(""));
+}
+
+class SlotLookUpTest : public TDevicesFixture {
+  protected:
+    static std::string SlotsOf(const TInMemClass& cls, std::initializer_list<const char*> names)
+    {
+        std::string text;
+        for (const char* const name : names) {
+            const std::uint32_t slot = cls.GetLayout().FindSlot(name);
+            text += (text.empty() ? "" : " ") + (slot == TInMemLayout::kNoSlot ? "-" : std::to_string(slot));
+        }
+        return text;
+    }
+};
+
+TEST_F(SlotLookUpTest, ARemovedPropertyIsNotFoundUntilItIsAddedAgain)
+{
+    EXPECT_EQ("1 1", SlotsOf(*fDisk, {"Size", "size"}));
+    fDisk->RemovePropertyDecl(fDisk->GetPropertyDecl("Size", kNoContext));
+    EXPECT_EQ("- -", SlotsOf(*fDisk, {"Size", "size"}));
+    EXPECT_EQ("- -", SlotsOf(*fSolidState, {"Size", "size"}));
+    fDisk->AddPropertyDecl(Decl({"SIZE", TType::kUint64, {}}));
+    EXPECT_EQ("2 2 2", SlotsOf(*fDisk, {"Size", "size", "SIZE"}));
+    EXPECT_EQ("3 3 3", SlotsOf(*fSolidState, {"Size", "size", "SIZE"}));
+}
+
+TEST_F(SlotLookUpTest, AnOverrideInAnotherSpellingIsFoundInBoth)
+{
+    fSolidState->AddPropertyDecl(Decl({"SIZE", TType::kUint64, {}}));
+    EXPECT_EQ("1 1 1", SlotsOf(*fSolidState, {"Size", "SIZE", "sIzE"}));
+    EXPECT_EQ("1 1 1", SlotsOf(*fDisk, {"Size", "SIZE", "sIzE"}));
+    fSolidState->RemovePropertyDecl(fSolidState->GetPropertyDecl("SIZE", kNoContext));
+    EXPECT_EQ("1 1 1", SlotsOf(*fSolidState, {"Size", "SIZE", "sIzE"}));
+}
+
+TEST_F(SlotLookUpTest, EachOfManyPropertiesIsFound)
+{
+    const auto cls = Allocate("Wide", nullptr);
+    for (int number = 0; number < 600; ++number) {
+        cls->AddPropertyDecl(Decl({"Property" + std::to_string(number), TType::kUint8, {}}));
+    }
+    for (std::uint32_t number = 0; number < 600; ++number) {
+        EXPECT_EQ(number, cls->GetLayout().FindSlot("Property" + std::to_string(number)));
+        EXPECT_EQ(number, cls->GetLayout().FindSlot("pROPERTY" + std::to_string(number)));
+    }
+    EXPECT_EQ(TInMemLayout::kNoSlot, cls->GetLayout().FindSlot("Property600"));
+}
+
+}  // namespace
+}  // namespace NORVZEL20
