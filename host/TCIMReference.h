@@ -106,6 +106,7 @@ class CIMDELTA_EXPORT TCIMReference {
     explicit TCIMReference(TContents* contents) noexcept;
     TContents& Own();
     void AppendText(std::string& out, TCIMValue::EKeyForm form) const;
+    bool MakePlainPath(std::string& path) const;
     /// The approximate length of the path's text; a text in need of many escapes is longer.
     std::size_t EstimateLength() const;
 

@@ -20,6 +20,7 @@
 #include "embedded/value/TReferenceContents.h"
 #include "embedded/value/TStubClass.h"
 #include "embedded/value/TValueAccess.h"
+#include "embedded/value/TValueText.h"
 #include "embedded/value/Trim.h"
 #include "host/TZELException.h"
 
@@ -47,6 +48,12 @@ void AppendPlace(std::string& out, const std::string& host, const std::string& n
     }
 }
 
+/// Copies `text` to `to` and returns the place behind it.
+char* Put(char* to, std::string_view text) noexcept
+{
+    return std::copy(text.begin(), text.end(), to);
+}
+
 void LowerFrom(std::string& out, std::size_t start)
 {
     const auto from = out.begin() + static_cast<std::ptrdiff_t>(start);
@@ -61,7 +68,7 @@ TCIMReference::TCIMReference(TContents* contents) noexcept : fContents(contents)
 
 TCIMReference::TCIMReference(boost::shared_ptr<ICIMNamespace> ns, std::map<std::string, TCIMValue> keys) : fContents(nullptr)
 {
-    TCIMReference path(new TContents);  // frees the contents if something below throws
+    TCIMReference path(TContents::Make());  // frees the contents if something below throws
     if (ns) {
         TContents::TPlace& place = path.fContents->OwnPlace();
         place.ns = ns;
@@ -93,8 +100,8 @@ TCIMReference& TCIMReference::operator=(const TCIMReference& other) noexcept
 
 TCIMReference::~TCIMReference()
 {
-    if (fContents != nullptr && fContents->Release()) {
-        delete fContents;
+    if (fContents != nullptr) {
+        TContents::Drop(fContents);
     }
 }
 
@@ -102,7 +109,7 @@ TCIMReference::~TCIMReference()
 TCIMReference::TContents& TCIMReference::Own()
 {
     if (fContents == nullptr) {
-        fContents = new TContents;
+        fContents = TContents::Make();
     } else if (!fContents->IsUnique()) {
         // The swap gives up the use of the shared contents after the copy has succeeded.
         TCIMReference copy(new TContents(*fContents));
@@ -120,6 +127,12 @@ void TCIMReference::AddKeyValue(const std::string& name, const TCIMValue& value)
     }
     TContents& contents = Own();
     auto& bindings = contents.bindings;
+    // Keys mostly come in their order.
+    if (bindings.empty() || TNameText::Compare(bindings.back().first, name) < 0) {
+        bindings.emplace_back(name, value);
+        contents.depth = std::max(contents.depth, depth);
+        return;
+    }
     const auto place =
         std::lower_bound(bindings.begin(), bindings.end(), name, [](const TContents::TBinding& binding, const std::string& wanted) {
             return TNameText::Compare(binding.first, wanted) < 0;
@@ -158,9 +171,45 @@ void TCIMReference::SetClass(boost::shared_ptr<ICIMClass> cls)
 std::string TCIMReference::GetPath() const
 {
     std::string path;
-    path.reserve(EstimateLength());
-    AppendPath(path);
+    if (!MakePlainPath(path)) {
+        path.reserve(EstimateLength());
+        AppendPath(path);
+    }
     return path;
+}
+
+/// Makes the text of a path without namespace whose keys are all text without anything to escape, as nearly all are: in one block
+/// of the right size. Returns false for other paths.
+bool TCIMReference::MakePlainPath(std::string& path) const
+{
+    if (fContents == nullptr || fContents->place) {
+        return false;
+    }
+    const std::string& className = GetClassName();
+    std::size_t length = className.size();
+    for (const TContents::TBinding& binding : fContents->bindings) {
+        if (!TValueAccess::IsText(binding.second)) {
+            return false;
+        }
+        const std::string_view text = TValueAccess::GetText(binding.second);
+        if (TValueText::NeedsEscape(text, '"')) {
+            return false;
+        }
+        length += binding.first.size() + text.size() + std::string_view(".=\"\"").size();
+    }
+    path.resize(length);
+    char* to = Put(path.data(), className);
+    char separator = '.';
+    for (const TContents::TBinding& binding : fContents->bindings) {
+        *to++ = separator;
+        to = Put(to, binding.first);
+        *to++ = '=';
+        *to++ = '"';
+        to = Put(to, TValueAccess::GetText(binding.second));
+        *to++ = '"';
+        separator = ',';
+    }
+    return true;
 }
 
 std::size_t TCIMReference::EstimateLength() const
@@ -265,35 +314,6 @@ const TCIMValue* TCIMReference::FindKeyValue(const std::string& name) const
     const auto found = std::find_if(bindings.begin(), bindings.end(),
                                     [&name](const TContents::TBinding& binding) { return TNameText::Equal(binding.first, name); });
     return found != bindings.end() ? &found->second : nullptr;
-}
-
-unsigned int TCIMReference::TContents::GetDepth(const TCIMValue& value)
-{
-    switch (TValueAccess::GetForm(value)) {
-    case TValueAccess::kPath: {
-        const TContents* const contents = TValueAccess::GetPath(value).fContents;
-        // Each path keeps its own depth, so this does not descend into it.
-        return contents != nullptr ? contents->depth + 1 : 1;
-    }
-    case TValueAccess::kArray:
-    case TValueAccess::kBag: {
-        unsigned int depth = 0;
-        for (const TCIMValue& element : value.GetElements()) {
-            depth = std::max(depth, GetDepth(element));
-        }
-        return depth;
-    }
-    case TValueAccess::kObject: {
-        // A key text quotes the paths within an object like those within an array.
-        unsigned int depth = 0;
-        for (const TEmbeddedObject::TProperty& property : value.GetEmbeddedObject()->GetProperties()) {
-            depth = std::max(depth, GetDepth(property.value));
-        }
-        return depth;
-    }
-    default:
-        return 0;
-    }
 }
 
 }  // namespace NORVZEL20

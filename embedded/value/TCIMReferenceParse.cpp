@@ -272,7 +272,7 @@ TCIMReference TCIMReference::Parse(const std::string& text, boost::shared_ptr<IC
         }
         throw;
     }
-    TCIMReference path(new TContents);
+    TCIMReference path(TContents::Make());
     if (!reader.GetHost().empty()) {
         path.SetHost(std::string(reader.GetHost()));
     }

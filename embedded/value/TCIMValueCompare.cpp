@@ -103,15 +103,15 @@ std::string GetKeyText(const TCIMValue& value)
 
 bool TCIMValue::operator==(const TCIMValue& other) const
 {
+    // The same bytes mean the same value, and the same block means the same contents.
+    if (TAccess::HasSameBytes(*this, other)) {
+        return true;
+    }
     if (IsNull() || other.IsNull()) {
         return IsNull() && other.IsNull();
     }
     if (fType != other.fType) {
         return false;
-    }
-    // The same bytes mean the same value, and the same block means the same contents.
-    if (fForm == other.fForm && std::memcmp(fBytes, other.fBytes, sizeof fBytes) == 0) {
-        return true;
     }
     switch (fForm) {
     case TAccess::kNumber:

@@ -22,6 +22,9 @@ class TCounted {
 
     bool IsUnique() const noexcept { return fUses.load(std::memory_order_acquire) == 1; }
 
+    /// Gives a block that nobody uses its first use again.
+    void Revive() const noexcept { fUses.store(1, std::memory_order_relaxed); }
+
   private:
     mutable std::atomic<std::uint32_t> fUses{1};
 };

@@ -31,6 +31,11 @@ struct TCIMReference::TContents : TCounted {
           bindings(other.bindings), depth(other.depth)
     {}
 
+    /// Contents of an empty path, new or recycled, with one use. Errors: std::bad_alloc.
+    static TContents* Make();
+    /// Gives up one use.
+    static void Drop(TContents* contents) noexcept;
+
     TPlace& OwnPlace()
     {
         if (!place) {
@@ -49,6 +54,9 @@ struct TCIMReference::TContents : TCounted {
 
     /// How deep references are nested in `value`; 0 if there is none.
     static unsigned int GetDepth(const TCIMValue& value);
+
+    struct TSpares;
+    struct TSparesEnd;
 
     std::unique_ptr<TPlace> place;  // null: no namespace and no host
     boost::shared_ptr<ICIMClass> cls;

@@ -11,6 +11,18 @@
 
 namespace NORVZEL20 {
 
+namespace {
+
+template <class TBlock>
+void DropUse(const TBlock* block) noexcept
+{
+    if (block->Release()) {
+        delete block;
+    }
+}
+
+}  // namespace
+
 static_assert(sizeof(TCIMValue) == 16, "values are laid out inline in instances by the million");
 static_assert(sizeof(TCIMReference) == sizeof(void*), "a path value holds the path itself in the place of its pointer");
 
@@ -108,20 +120,23 @@ void TValueAccess::LimitDepth(TCIMValue& key, unsigned int above)
 void TValueAccess::DropBlock(const TCIMValue& value) noexcept
 {
     const TCounted* const block = GetBlock(value);
-    if (value.fForm == kSharedText) {
+    switch (value.fForm) {
+    case kSharedText:
         TSharedText::Drop(static_cast<const TSharedText*>(block));
-    } else if (block != nullptr && block->Release()) {
-        switch (value.fForm) {
-        case kObject:
-            delete static_cast<const TCountedObject*>(block);
-            break;
-        case kPath:
-            delete static_cast<const TCIMReference::TContents*>(block);
-            break;
-        default:
-            delete static_cast<const TCountedArray*>(block);
-            break;
+        break;
+    case kObject:
+        DropUse(static_cast<const TCountedObject*>(block));
+        break;
+    case kPath:
+        // The empty path has no contents. Who uses contents alone may change them, as the path did that made them.
+        if (block != nullptr) {
+            TCIMReference::TContents::Drop(
+                const_cast<TCIMReference::TContents*>(static_cast<const TCIMReference::TContents*>(block)));
         }
+        break;
+    default:
+        DropUse(static_cast<const TCountedArray*>(block));
+        break;
     }
 }
 

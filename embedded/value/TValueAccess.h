@@ -36,6 +36,16 @@ class CIMDELTA_INTERNAL_EXPORT TValueAccess {
     static std::string_view GetText(const TCIMValue& value) noexcept;
     static bool IsText(const TCIMValue& value) noexcept { return value.fForm == kShortText || value.fForm == kSharedText; }
 
+    /// Whether type, form and contents have the same bytes. Equal values may have different ones.
+    static bool HasSameBytes(const TCIMValue& a, const TCIMValue& b) noexcept
+    {
+        std::uint64_t words[2][2];
+        static_assert(sizeof words[0] == sizeof(TCIMValue), "a value is two words");
+        std::memcpy(words[0], static_cast<const void*>(&a), sizeof words[0]);
+        std::memcpy(words[1], static_cast<const void*>(&b), sizeof words[1]);
+        return ((words[0][0] ^ words[1][0]) | (words[0][1] ^ words[1][1])) == 0;
+    }
+
     /// The bits of a value of form kNumber: a signed integer sign-extended, a real as a double, a char16 as its unit.
     static std::uint64_t GetBits(const TCIMValue& value) noexcept { return Load<std::uint64_t>(value); }
     /// The number of a real.

@@ -7,8 +7,10 @@
 
 #include "embedded/value/TValueText.h"
 
+#include <algorithm>
 #include <charconv>
 #include <cmath>
+#include <cstring>
 #include <limits>
 #include <system_error>
 
@@ -232,16 +234,41 @@ void TValueText::AppendQuoted(std::string& out, std::string_view text, char quot
     AppendQuotedBy(out, quote, [text](std::string& to) { to += text; });
 }
 
+bool TValueText::NeedsEscape(std::string_view text, char quote) noexcept
+{
+    // Eight bytes at a time, the last eight once more. A quote makes a zero byte in `a`. Subtracting 1 from each byte sets the
+    // highest bit of a zero byte, and `& ~a` takes out the bytes that had it before. A borrow spoils only bytes above a zero byte.
+    constexpr std::uint64_t kOnes = 0x0101010101010101U;
+    constexpr std::uint64_t kHighest = 0x8080808080808080U;
+    const std::uint64_t quotes = kOnes * static_cast<unsigned char>(quote);
+    const std::uint64_t backslashes = kOnes * static_cast<unsigned char>('\\');
+    if (text.size() < sizeof quotes) {
+        return std::any_of(text.begin(), text.end(), [quote](char c) { return c == quote || c == '\\'; });
+    }
+    const auto findsAny = [&](std::size_t position) {
+        std::uint64_t word;
+        std::memcpy(&word, text.data() + position, sizeof word);
+        const std::uint64_t a = word ^ quotes;
+        const std::uint64_t b = word ^ backslashes;
+        return (((a - kOnes) & ~a) | ((b - kOnes) & ~b)) & kHighest;
+    };
+    std::uint64_t found = findsAny(text.size() - sizeof quotes);
+    for (std::size_t position = 0; position + sizeof quotes < text.size(); position += sizeof quotes) {
+        found |= findsAny(position);
+    }
+    return found != 0;
+}
+
 // Counts the escapes and then moves the characters to their places, beginning at the end. Cost: linear.
 void TValueText::EscapeFrom(std::string& out, std::size_t start, char quote)
 {
+    // Most text has nothing to escape and is not touched.
+    if (!NeedsEscape(std::string_view(out).substr(start), quote)) {
+        return;
+    }
     std::size_t escapes = 0;
     for (std::size_t i = start; i < out.size(); ++i) {
         escapes += out[i] == quote || out[i] == '\\' ? 1 : 0;
-    }
-    // Most text has none and is not touched.
-    if (escapes == 0) {
-        return;
     }
     std::size_t from = out.size();
     out.resize(out.size() + escapes);

@@ -38,8 +38,8 @@ class CIMDELTA_INTERNAL_EXPORT TValueText {
     /// Returns false, and leaves `result` as it is, for everything else.
     static bool Convert(const TCIMValue& value, TCIMValue::TCIMType type, TCIMValue& result);
 
-    /// Converts a key that was read from a path to the key's declared type: as Convert, or to a real32 that has the same text. 0.1 is
-    /// read as a real64, and no real32 is exactly that number. Returns false, and leaves `result` as it is, for everything else.
+    /// Converts a key that was read from a path to the key's declared type: as Convert, or to a real32 that has the same text. 0.1
+    /// is read as a real64, and no real32 is exactly that number. Returns false, and leaves `result` as it is, for everything else.
     static bool ConvertKey(const TCIMValue& value, TCIMValue::TCIMType type, TCIMValue& result);
 
     /// The name of a type in CIM-XML: "uint16" for the type and for arrays of it, "reference", "" for kNone.
@@ -51,6 +51,8 @@ class CIMDELTA_INTERNAL_EXPORT TValueText {
 
     /// Appends a boolean, number, char16, text or datetime, unquoted and unescaped. The value must not be null.
     static void AppendPlain(std::string& out, const TCIMValue& value);
+    /// Whether `text` has a `quote` or a `\`.
+    static bool NeedsEscape(std::string_view text, char quote) noexcept;
     /// Appends `text` between two `quote` characters, with a `\` in front of each `quote` and `\`.
     static void AppendQuoted(std::string& out, std::string_view text, char quote);
     /// The same for the text that `write(out)` appends.

@@ -174,5 +174,38 @@ TEST(Threads, EightQueriesOverNamespacesOfTheirOwnAreAsOne)
     });
 }
 
+/// Each thread recycles the contents of paths. One of these paths ends after all that its thread keeps for that, the others on
+/// another thread than the one that made them.
+TEST(Threads, PathsMayOutliveTheirThreadAndWhatItKeepsForThem)
+{
+    const auto makePath = [](int number) {
+        TCIMReference path;
+        path.SetClassName("Disk");
+        path.AddKeyValue("Id", TCIMValue(number));
+        return path;
+    };
+    std::mutex mutex;
+    std::vector<TCIMReference> survivors;
+    const auto work = [&]() -> std::string {
+        thread_local TCIMReference fgLast;  // made before its thread keeps anything, so it is destroyed after that
+        fgLast = makePath(0);
+        std::string texts = fgLast.GetPath();
+        for (int number = 1; number < 100; ++number) {
+            const TCIMReference path = makePath(number);
+            texts += " " + path.GetPath();
+            const std::lock_guard<std::mutex> lock(mutex);
+            survivors.push_back(number % 10 == 0 ? path : makePath(-number));
+        }
+        return texts;
+    };
+    ExpectAsAlone(work);
+    ASSERT_EQ((kThreads + 1) * 99, survivors.size());
+    std::size_t tens = 0;
+    for (const TCIMReference& path : survivors) {
+        tens += path.GetPath().find("=-") == std::string::npos ? 1 : 0;
+    }
+    EXPECT_EQ((kThreads + 1) * 9, tens);
+}
+
 }  // namespace
 }  // namespace NORVZEL20

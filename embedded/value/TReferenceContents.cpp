@@ -1,0 +1,109 @@
+// Paths come and go with every look-up of an instance, so each thread keeps the contents of the last few paths that ended, with the
+// memory of their bindings.
+//
+// The list of spares needs no destructor, so paths may end at any moment of a thread, also after its other thread-local objects.
+// A separate object frees the spares when the thread ends; from then on none are kept.
+
+#include "embedded/value/TReferenceContents.h"
+
+#include <algorithm>
+
+#include "embedded/value/TEmbeddedObject.h"
+#include "embedded/value/TValueAccess.h"
+
+namespace NORVZEL20 {
+
+namespace {
+
+constexpr std::size_t kMostKeptBindings = 8;
+
+}  // namespace
+
+struct TCIMReference::TContents::TSpares {
+    static constexpr unsigned int kMost = 4;
+
+    TContents* contents[kMost];
+    unsigned int count;
+    bool isClosed;
+
+    static TSpares& OfThread() noexcept
+    {
+        thread_local TSpares fgSpares{};
+        return fgSpares;
+    }
+};
+
+/// Frees the spares of its thread.
+struct TCIMReference::TContents::TSparesEnd {
+    TSpares& spares;
+
+    ~TSparesEnd()
+    {
+        spares.isClosed = true;
+        while (spares.count > 0) {
+            delete spares.contents[--spares.count];
+        }
+    }
+};
+
+TCIMReference::TContents* TCIMReference::TContents::Make()
+{
+    TSpares& spares = TSpares::OfThread();
+    if (spares.count == 0) {
+        return new TContents;
+    }
+    TContents* const contents = spares.contents[--spares.count];
+    contents->Revive();
+    return contents;
+}
+
+void TCIMReference::TContents::Drop(TContents* contents) noexcept
+{
+    if (!contents->Release()) {
+        return;
+    }
+    // What the path held may be the last use of other paths, which end here and become spares themselves.
+    contents->place.reset();
+    contents->cls.reset();
+    contents->bindings.clear();
+    contents->depth = 0;
+    TSpares& spares = TSpares::OfThread();
+    if (spares.isClosed || spares.count == TSpares::kMost || contents->bindings.capacity() > kMostKeptBindings) {
+        delete contents;
+        return;
+    }
+    thread_local const TSparesEnd fgEnd{spares};
+    static_cast<void>(fgEnd);
+    spares.contents[spares.count++] = contents;
+}
+
+unsigned int TCIMReference::TContents::GetDepth(const TCIMValue& value)
+{
+    switch (TValueAccess::GetForm(value)) {
+    case TValueAccess::kPath: {
+        const TContents* const contents = TValueAccess::GetPath(value).fContents;
+        // Each path keeps its own depth, so this does not descend into it.
+        return contents != nullptr ? contents->depth + 1 : 1;
+    }
+    case TValueAccess::kArray:
+    case TValueAccess::kBag: {
+        unsigned int depth = 0;
+        for (const TCIMValue& element : value.GetElements()) {
+            depth = std::max(depth, GetDepth(element));
+        }
+        return depth;
+    }
+    case TValueAccess::kObject: {
+        // A key text quotes the paths within an object like those within an array.
+        unsigned int depth = 0;
+        for (const TEmbeddedObject::TProperty& property : value.GetEmbeddedObject()->GetProperties()) {
+            depth = std::max(depth, GetDepth(property.value));
+        }
+        return depth;
+    }
+    default:
+        return 0;
+    }
+}
+
+}  // namespace NORVZEL20
