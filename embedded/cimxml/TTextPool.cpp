@@ -5,8 +5,9 @@
 // keeps one text.
 //
 // The first time a text comes, the bucket only notes its hash. If the next text in that bucket has the same hash, it is taken as
-// repeating and kept, in place of the one before. So texts that are all different cost a hash and no more, and texts that repeat
-// are not pushed out by a single other one. Two texts with the same hash do no harm: the text itself is compared.
+// repeating and kept, in place of the one before. So texts that are all different cost a hash and their characters in a run, and
+// texts that repeat are not pushed out by a single other one. Longer text hardly ever repeats and has a block of its own. Two texts
+// with the same hash do no harm: the text itself is compared.
 #include "embedded/cimxml/TTextPool.h"
 
 #include <cstdint>
@@ -40,7 +41,7 @@ std::uint64_t HashOf(std::string_view text)
 
 TCIMValue TTextPool::MakeValue(std::string_view text)
 {
-    if (text.size() <= TValueAccess::kShortTextSize || text.size() > kLongest) {
+    if (text.size() <= TValueAccess::kShortTextSize || text.size() > TTextRun::kLongestText) {
         return TCIMValue::FromText(text);
     }
     const std::uint64_t hash = HashOf(text);
@@ -50,11 +51,20 @@ TCIMValue TTextPool::MakeValue(std::string_view text)
         return TValueAccess::FromSharedText(bucket.text);
     }
     if (std::exchange(bucket.last, mark) != mark) {
-        return TCIMValue::FromText(text);
+        return MakeInRun(text);
     }
     bucket.text = TSharedText::Create(text);
     bucket.hash = mark;
     return TValueAccess::FromSharedText(bucket.text);
+}
+
+TCIMValue TTextPool::MakeInRun(std::string_view text)
+{
+    if (!fRun || !fRun->HasRoomFor(text.size())) {
+        fRun = TTextRun::Create();
+    }
+    const std::uint16_t offset = fRun->Append(text);
+    return TValueAccess::FromRun(*fRun, offset, static_cast<std::uint16_t>(text.size()));
 }
 
 }  // namespace NORVZEL20

@@ -4,11 +4,12 @@
 //     number       type  form  -                              64 bits
 //     datetime     type  form  offset, unknown fields, kind   microseconds
 //     short text   type  form  length            up to 13 bytes of text
+//     text in run  type  form  length, offset                 pointer to a TTextRun, which begins with TCounted
 //     others       type  form  -                              pointer to a block that begins with TCounted
 //
 // A signed integer is sign-extended and a real32 is held as a double. Longer text, arrays, paths and embedded objects are in
-// blocks that never change, so a copy is 16 bytes and one more use of the block. A moved-from value is a null of its type. The
-// form says how to read the rest; TValueAccess lists the forms and has the unchecked access to them.
+// blocks that never change (a run only gets further texts), so a copy is 16 bytes and one more use of the block. A moved-from value
+// is a null of its type. The form says how to read the rest; TValueAccess lists the forms and has the unchecked access to them.
 
 #include "host/TCIMValue.h"
 
@@ -340,6 +341,7 @@ void TCIMValue::AppendKey(std::string& out, EKeyForm form) const
     switch (fForm) {
     case TAccess::kShortText:
     case TAccess::kSharedText:
+    case TAccess::kRunText:
         TValueText::AppendQuoted(out, TAccess::GetText(*this), '"');
         break;
     case TAccess::kNumber:

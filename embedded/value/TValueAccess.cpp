@@ -40,10 +40,24 @@ TCIMValue TValueAccess::FromSharedText(const TSharedText::TPointer& text) noexce
     return value;
 }
 
+TCIMValue TValueAccess::FromRun(const TTextRun& run, std::uint16_t offset, std::uint16_t length) noexcept
+{
+    TCIMValue value(TCIMValue::TCIMType::kString, kRunText);
+    run.Acquire();
+    Store(value, length, kRunLength);
+    Store(value, offset, kRunOffset);
+    Store(value, static_cast<const TCounted*>(&run));
+    return value;
+}
+
 std::string_view TValueAccess::GetText(const TCIMValue& value) noexcept
 {
     if (value.fForm == kShortText) {
         return {reinterpret_cast<const char*>(value.fBytes + 1), value.fBytes[0]};
+    }
+    if (value.fForm == kRunText) {
+        const auto* const run = static_cast<const TTextRun*>(GetBlock(value));
+        return run->GetText(Load<std::uint16_t>(value, kRunOffset), Load<std::uint16_t>(value, kRunLength));
     }
     return static_cast<const TSharedText*>(GetBlock(value))->GetText();
 }
@@ -123,6 +137,9 @@ void TValueAccess::DropBlock(const TCIMValue& value) noexcept
     switch (value.fForm) {
     case kSharedText:
         TSharedText::Drop(static_cast<const TSharedText*>(block));
+        break;
+    case kRunText:
+        TTextRun::Drop(static_cast<const TTextRun*>(block));
         break;
     case kObject:
         DropUse(static_cast<const TCountedObject*>(block));

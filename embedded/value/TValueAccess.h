@@ -3,6 +3,7 @@
 #include <cstring>
 
 #include "embedded/value/TSharedText.h"
+#include "embedded/value/TTextRun.h"
 #include "host/Export.h"
 #include "host/TCIMDateTime.h"
 #include "host/TCIMReference.h"
@@ -20,6 +21,7 @@ class CIMDELTA_INTERNAL_EXPORT TValueAccess {
         kDateTime,    ///< the parts of a TCIMDateTime
         kShortText,   ///< length and up to kShortTextSize bytes
         kSharedText,  ///< TSharedText
+        kRunText,     ///< length and offset of a text in a TTextRun
         kObject,      ///< TCountedObject
         kArray,       ///< TCountedArray
         kBag,         ///< TCountedArray, compared as a multiset
@@ -32,9 +34,12 @@ class CIMDELTA_INTERNAL_EXPORT TValueAccess {
     /// A string that shares `text`, or has a copy of a short one. `text` must not be null.
     static TCIMValue FromSharedText(const TSharedText::TPointer& text) noexcept;
 
+    /// A string whose text is the one at `offset` of `run`, of which it becomes a user.
+    static TCIMValue FromRun(const TTextRun& run, std::uint16_t offset, std::uint16_t length) noexcept;
+
     /// The text of a value for which IsText is true.
     static std::string_view GetText(const TCIMValue& value) noexcept;
-    static bool IsText(const TCIMValue& value) noexcept { return value.fForm == kShortText || value.fForm == kSharedText; }
+    static bool IsText(const TCIMValue& value) noexcept { return value.fForm >= kShortText && value.fForm <= kRunText; }
 
     /// Whether type, form and contents have the same bytes. Equal values may have different ones.
     static bool HasSameBytes(const TCIMValue& a, const TCIMValue& b) noexcept
@@ -67,6 +72,9 @@ class CIMDELTA_INTERNAL_EXPORT TValueAccess {
 
     // A number or a pointer is at offset 8 of the value, which is aligned to 8.
     static constexpr std::size_t kPayload = 6;
+    // Of a text in a run, in front of the pointer.
+    static constexpr std::size_t kRunLength = 0;
+    static constexpr std::size_t kRunOffset = 2;
 
     template <class T>
     static T Load(const TCIMValue& value, std::size_t offset = kPayload) noexcept

@@ -1,32 +1,13 @@
-#include <malloc.h>
-
 #include <cstdio>
 #include <vector>
 
 #include "host/TAddToVectorCallback.h"
 #include "tests/embedded/store/CountedAllocations.h"
 #include "tests/embedded/store/TInMemFixture.h"
-
-// Every sanitizer's runtime has this, but GCC installs no header for it.
-extern "C" std::size_t __sanitizer_get_current_allocated_bytes();
+#include "tests/support/HeapInUse.h"
 
 namespace NORVZEL20 {
 namespace {
-
-#if defined(__SANITIZE_ADDRESS__) || defined(__SANITIZE_THREAD__)
-/// mallinfo2 does not see the sanitizer's heap, which counts what was asked for.
-std::size_t HeapInUse()
-{
-    return __sanitizer_get_current_allocated_bytes();
-}
-#else
-/// Blocks with what the allocator adds to them.
-std::size_t HeapInUse()
-{
-    const struct mallinfo2 info = mallinfo2();
-    return info.uordblks + info.hblkhd;
-}
-#endif
 
 class InMemMemoryTest : public TInMemFixture {
   protected:
