@@ -1,82 +1,62 @@
 // How an instance lies in memory.
 //
-//   [ counts of the shared pointer | TInMemInstance | head | property | property | ... ]
+//   [ counts of the shared pointer | TInMemInstance | property | property | ... ]
 //
-// All this is one allocation, of the size that the class has slots at that moment, and reading a property follows no pointer but
-// the one to the block. The property in slot n stands at position n of the instance's own block. When the class gets a property
-// later, the instance cannot grow in place, because handles point into it. A late block then holds the slots that are missing; it
-// is made when one of them is first asked for, for all slots that the class has by then. So most instances have none, few have one,
-// and an instance has another only if the class grows again. Late blocks, values before the first MarkChanged and keys that have
-// changed since the instance was added are kept in the extras, which most instances do without.
+// All this is one allocation, of the size that the class has slots at that moment, and reading a property follows no pointer. The
+// property in slot n stands at position n behind the instance. When the class gets a property later, the instance cannot grow in
+// place, because handles point into it. A late block then holds slots that are missing; it is made when one of them is first
+// asked for, for all slots that the class has by then. So most instances have none, few have one, and an instance has another only
+// if the class grows again or has very many properties. Late blocks and notes are kept in the extras, which most instances do
+// without. Notes are rare facts about a slot: the value before the first MarkChanged, the key as added if it has changed since, and
+// that the property is marked as removed.
 
 #include "embedded/store/TInMemInstance.h"
 
+#include <algorithm>
 #include <vector>
 
-#include "embedded/store/TInMemBlock.h"
 #include "embedded/store/TInMemClass.h"
 #include "embedded/store/TInMemExtent.h"
+#include "embedded/store/TInMemLateBlock.h"
 #include "embedded/store/TInMemNamespace.h"
 #include "embedded/store/TPlacedAllocator.h"
 #include "embedded/store/TStoreRefusal.h"
 
 namespace NORVZEL20 {
 
-namespace {
-
-struct TSlotValue {
-    std::uint32_t slot;
-    TCIMValue value;
-};
-
-const TCIMValue* Find(const std::vector<TSlotValue>& values, std::uint32_t slot) noexcept
-{
-    for (const TSlotValue& entry : values) {
-        if (entry.slot == slot) {
-            return &entry.value;
-        }
-    }
-    return nullptr;
-}
-
-}  // namespace
-
 struct TInMemInstance::TExtras {
-    struct TLateBlock {
-        TInMemBlock* block;
-        std::uint32_t first;  ///< the slot of the first property
-        std::uint32_t count;
+    enum class EAbout : unsigned char { kEarlier, kAddedKey, kRemoved };
+
+    struct TNote {
+        std::uint32_t slot;
+        EAbout about;
+        TCIMValue value;
     };
 
-    TExtras() = default;
-    TExtras(const TExtras&) = delete;
-    TExtras& operator=(const TExtras&) = delete;
-    ~TExtras()
+    const TNote* Find(EAbout about, std::uint32_t slot) const noexcept
     {
-        for (const TLateBlock& late : lateBlocks) {
-            late.block->Destroy(late.count);
-            ::operator delete(late.block);
-        }
+        const auto found =
+            std::find_if(notes.begin(), notes.end(), [&](const TNote& note) { return note.slot == slot && note.about == about; });
+        return found == notes.end() ? nullptr : &*found;
     }
 
-    std::vector<TLateBlock> lateBlocks;  ///< in order of slots
-    std::vector<TSlotValue> earlier;     ///< values before the first MarkChanged
-    std::vector<TSlotValue> keys;        ///< keys as added, if they have changed since
+    std::vector<TInMemLateBlock::TPointer> lateBlocks;  ///< in order of slots
+    std::vector<TNote> notes;
 };
 
-TInMemBlock& TInMemInstance::GetOwnBlock() const noexcept
+TInMemProperty* TInMemInstance::GetOwnProperties() const noexcept
 {
     // Operations that are const give out handles through which properties are changed.
-    return *reinterpret_cast<TInMemBlock*>(const_cast<TInMemInstance*>(this) + 1);
+    return reinterpret_cast<TInMemProperty*>(const_cast<TInMemInstance*>(this) + 1);
 }
 
 boost::shared_ptr<TInMemInstance> TInMemInstance::Create(boost::shared_ptr<TInMemClass> cls)
 {
     // One allocation for everything. The allocator puts the counts of the shared pointer in front of the instance.
     using TAllocator = TPlacedAllocator<TInMemInstance>;
-    const std::uint32_t slots = cls->GetLayout().GetSlotCount();
-    char* const block =
-        static_cast<char*>(::operator new(TAllocator::kPlace + sizeof(TInMemInstance) + TInMemBlock::GetSize(slots)));
+    const std::uint32_t slots = std::min(cls->GetLayout().GetSlotCount(), TInMemProperty::kMostBehindInstance);
+    const std::size_t size = TAllocator::kPlace + sizeof(TInMemInstance) + slots * sizeof(TInMemProperty);
+    char* const block = static_cast<char*>(::operator new(size));
     TInMemInstance* const instance = new (block + TAllocator::kPlace) TInMemInstance(std::move(cls), slots);
     const auto destroy = [](TInMemInstance* made) { made->~TInMemInstance(); };
     return boost::shared_ptr<TInMemInstance>(instance, destroy, TAllocator(block));
@@ -85,12 +65,16 @@ boost::shared_ptr<TInMemInstance> TInMemInstance::Create(boost::shared_ptr<TInMe
 TInMemInstance::TInMemInstance(boost::shared_ptr<TInMemClass> cls, std::uint32_t slots) noexcept
     : fClass(std::move(cls)), fSlots(slots & 0x7fffffffU), fAdded(0)
 {
-    TInMemBlock::Make(this + 1, *this, fClass->GetLayout(), 0, slots);
+    for (std::uint32_t slot = 0; slot < slots; ++slot) {
+        TInMemProperty::MakeBehindInstance(GetOwnProperties() + slot, slot, fClass->GetLayout().GetDecl(slot).GetType());
+    }
 }
 
 TInMemInstance::~TInMemInstance()
 {
-    GetOwnBlock().Destroy(fSlots);
+    for (std::uint32_t slot = 0; slot < fSlots; ++slot) {
+        GetOwnProperties()[slot].Destroy();
+    }
 }
 
 void TInMemInstance::Validate(TCallContext) const
@@ -172,7 +156,7 @@ TInMemProperty* TInMemInstance::FindProperty(std::string_view name) const
 
 TInMemProperty& TInMemInstance::GetSlotProperty(std::uint32_t slot) const
 {
-    return slot < fSlots ? GetOwnBlock().GetProperty(slot) : GetLateProperty(slot);
+    return slot < fSlots ? GetOwnProperties()[slot] : GetLateProperty(slot);
 }
 
 const TCIMValue& TInMemInstance::GetSlotValue(std::uint32_t slot) const
@@ -188,7 +172,7 @@ void TInMemInstance::SetSlot(std::uint32_t slot, TCIMValue value)
         decl->GetStaticProperty().SetValue(value);
         return;
     }
-    GetSlotProperty(slot).SetValue(std::move(value));
+    Change(slot, Fit(slot, std::move(value)));
 }
 
 const std::string* TInMemInstance::FindMissingKey() const
@@ -212,46 +196,74 @@ TInMemInstance::TExtras& TInMemInstance::GetExtras() const
 
 TInMemProperty& TInMemInstance::GetLateProperty(std::uint32_t slot) const
 {
-    std::vector<TExtras::TLateBlock>& lateBlocks = GetExtras().lateBlocks;
+    std::vector<TInMemLateBlock::TPointer>& lateBlocks = GetExtras().lateBlocks;
     std::uint32_t end = fSlots;
-    for (const TExtras::TLateBlock& late : lateBlocks) {
-        end = late.first + late.count;
+    for (const TInMemLateBlock::TPointer& late : lateBlocks) {
+        end = late->GetEnd();
         if (slot < end) {
-            return late.block->GetProperty(slot - late.first);
+            return late->GetProperty(slot - late->GetFirst());
         }
     }
-    // Room first: once the block is made, nothing may fail.
-    lateBlocks.reserve(lateBlocks.size() + 1);
-    const TInMemLayout& layout = fClass->GetLayout();
-    const std::uint32_t count = layout.GetSlotCount() - end;
-    void* const memory = ::operator new(TInMemBlock::GetSize(count));
-    TInMemBlock& block = TInMemBlock::Make(memory, const_cast<TInMemInstance&>(*this), layout, end, count);
-    lateBlocks.push_back(TExtras::TLateBlock{&block, end, count});
-    return block.GetProperty(slot - end);
-}
-
-void TInMemInstance::KeepKey(std::uint32_t slot, const TCIMValue& value)
-{
-    std::vector<TSlotValue>& keys = GetExtras().keys;
-    if (!Find(keys, slot)) {
-        keys.push_back(TSlotValue{slot, value});
+    while (slot >= end) {
+        lateBlocks.push_back(TInMemLateBlock::Make(const_cast<TInMemInstance&>(*this), fClass->GetLayout(), end));
+        end = lateBlocks.back()->GetEnd();
     }
+    return lateBlocks.back()->GetProperty(slot - lateBlocks.back()->GetFirst());
 }
 
-void TInMemInstance::KeepEarlier(std::uint32_t slot, const TCIMValue& value)
+TCIMValue TInMemInstance::Fit(std::uint32_t slot, TCIMValue&& value) const
 {
-    GetExtras().earlier.push_back(TSlotValue{slot, value});
+    return fClass->GetLayout().GetDecl(slot).Fit(std::move(value), this);
+}
+
+/// Everything that may fail comes first: the caller has checked the new value, and the old one is kept if it will be asked for.
+/// Then the value is set.
+void TInMemInstance::Change(std::uint32_t slot, TCIMValue&& fitting)
+{
+    TInMemProperty& property = GetSlotProperty(slot);
+    // The index of the extent finds the instance by the key that it was added with.
+    if (fAdded != 0 && fClass->GetLayout().GetDecl(slot).IsKey() && !GetExtras().Find(TExtras::EAbout::kAddedKey, slot)) {
+        fExtras->notes.push_back({slot, TExtras::EAbout::kAddedKey, property.fValue});
+    }
+    property.fValue = std::move(fitting);
+}
+
+void TInMemInstance::MarkChanged(std::uint32_t slot, TCIMValue&& fitting)
+{
+    if (FindEarlier(slot)) {
+        Change(slot, std::move(fitting));
+        return;
+    }
+    // Room first: the change itself may need room for a note too, and once it is made, nothing may fail.
+    std::vector<TExtras::TNote>& notes = GetExtras().notes;
+    notes.reserve(notes.size() + 2);
+    TCIMValue earlier = GetSlotProperty(slot).fValue;
+    Change(slot, std::move(fitting));
+    notes.push_back({slot, TExtras::EAbout::kEarlier, std::move(earlier)});
 }
 
 const TCIMValue* TInMemInstance::FindEarlier(std::uint32_t slot) const noexcept
 {
-    return fExtras ? Find(fExtras->earlier, slot) : nullptr;
+    const TExtras::TNote* const note = fExtras ? fExtras->Find(TExtras::EAbout::kEarlier, slot) : nullptr;
+    return note ? &note->value : nullptr;
+}
+
+void TInMemInstance::MarkRemoved(std::uint32_t slot)
+{
+    if (!IsMarkedRemoved(slot)) {
+        GetExtras().notes.push_back({slot, TExtras::EAbout::kRemoved, TCIMValue()});
+    }
+}
+
+bool TInMemInstance::IsMarkedRemoved(std::uint32_t slot) const noexcept
+{
+    return fExtras && fExtras->Find(TExtras::EAbout::kRemoved, slot);
 }
 
 const TCIMValue& TInMemInstance::GetAddedKey(std::uint32_t slot) const
 {
-    const TCIMValue* const added = fExtras ? Find(fExtras->keys, slot) : nullptr;
-    return added ? *added : GetSlotValue(slot);
+    const TExtras::TNote* const note = fExtras ? fExtras->Find(TExtras::EAbout::kAddedKey, slot) : nullptr;
+    return note ? note->value : GetSlotValue(slot);
 }
 
 void TInMemInstance::SetAdded(std::uint32_t keyHash) noexcept
@@ -265,7 +277,8 @@ void TInMemInstance::SetRemoved() noexcept
     fAdded = 0;
     if (fExtras) {
         // Outside of an extent the present keys count.
-        fExtras->keys.clear();
+        const auto isKey = [](const TExtras::TNote& note) { return note.about == TExtras::EAbout::kAddedKey; };
+        fExtras->notes.erase(std::remove_if(fExtras->notes.begin(), fExtras->notes.end(), isKey), fExtras->notes.end());
     }
 }
 

@@ -12,12 +12,12 @@
 
 namespace NORVZEL20 {
 
-class TInMemBlock;
 class TInMemClass;
 
-/// An instance in memory: one block with the shared pointer's counts, the instance and all its properties.
+/// An instance in memory: one block with the shared pointer's counts, the instance and its properties.
 ///
-/// TInMemClass::AllocateInMemInstance makes it. A property that the class gets later is made when it is first asked for. Handles
+/// TInMemClass::AllocateInMemInstance makes it. A property that the class gets later is made when it is first asked for, and so are
+/// those beyond the first TInMemProperty::kMostBehindInstance. Handles
 /// stay valid when the instance is deleted and when the namespace goes; AddToNamespace then throws kNamespaceGone (18).
 /// Threads: as the namespace, reading included.
 class CIMDELTA_EXPORT TInMemInstance final : public ICIMInstance, public boost::enable_shared_from_this<TInMemInstance> {
@@ -61,13 +61,25 @@ class CIMDELTA_EXPORT TInMemInstance final : public ICIMInstance, public boost::
     /// The hash of the keys as added.
     std::uint32_t GetKeyHash() const noexcept { return fKeyHash; }
 
-    /// A property calls this before it changes, if it is a key of an instance that is part of the namespace. The first value kept
-    /// counts until the instance is removed. Errors: std::bad_alloc, and then nothing has changed.
-    void KeepKey(std::uint32_t slot, const TCIMValue& value);
-    /// A property calls this before its first MarkChanged. Errors: std::bad_alloc, and then nothing has changed.
-    void KeepEarlier(std::uint32_t slot, const TCIMValue& value);
-    /// What KeepEarlier has kept for the slot, or null.
+    /// The value in the form in which the property in that slot holds it. Errors: kTypeMismatch (13).
+    TCIMValue Fit(std::uint32_t slot, TCIMValue&& value) const;
+    /// Sets the instance's own property in a slot. While the instance is in a namespace, it keeps the first value that a key had.
+    /// Errors: std::bad_alloc, and then nothing has changed.
+    void Change(std::uint32_t slot, TCIMValue&& fitting);
+    /// The same; the value before the first such change is kept.
+    void MarkChanged(std::uint32_t slot, TCIMValue&& fitting);
+    /// The value before the first MarkChanged, or null.
     const TCIMValue* FindEarlier(std::uint32_t slot) const noexcept;
+    /// Errors: std::bad_alloc.
+    void MarkRemoved(std::uint32_t slot);
+    bool IsMarkedRemoved(std::uint32_t slot) const noexcept;
+
+    /// The instance that the row of properties beginning with `first` stands behind.
+    static TInMemInstance& GetOwner(const TInMemProperty& first) noexcept
+    {
+        // Operations that are const give out handles through which properties are changed.
+        return *(const_cast<TInMemInstance*>(reinterpret_cast<const TInMemInstance*>(&first)) - 1);
+    }
 
   private:
     friend class TInMemExtent;  // the owner: it alone says whether the instance is part of the namespace
@@ -75,7 +87,7 @@ class CIMDELTA_EXPORT TInMemInstance final : public ICIMInstance, public boost::
     struct TExtras;  // what few instances have
 
     TInMemInstance(boost::shared_ptr<TInMemClass> cls, std::uint32_t slots) noexcept;
-    TInMemBlock& GetOwnBlock() const noexcept;
+    TInMemProperty* GetOwnProperties() const noexcept;
     boost::shared_ptr<ICIMProperty> GetHandle(std::uint32_t slot, boost::shared_ptr<const TInMemInstance> self) const;
     TExtras& GetExtras() const;
     TInMemProperty& GetLateProperty(std::uint32_t slot) const;
@@ -85,7 +97,7 @@ class CIMDELTA_EXPORT TInMemInstance final : public ICIMInstance, public boost::
     boost::shared_ptr<TInMemClass> fClass;
     mutable std::unique_ptr<TExtras> fExtras;
     std::uint32_t fKeyHash = 0;
-    std::uint32_t fSlots : 31;  // in the own block, which stands behind the instance
+    std::uint32_t fSlots : 31;  // whose properties stand behind the instance
     std::uint32_t fAdded : 1;
 };
 

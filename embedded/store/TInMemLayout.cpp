@@ -26,7 +26,7 @@ TInMemLayout::TInMemLayout(const TInMemLayout* super) : fSuper(super)
 std::uint32_t TInMemLayout::FindSlot(std::string_view name) const noexcept
 {
     const std::uint32_t likely = fLikelySlots.Guess(name);
-    if (likely != TLikelySlots::kNone && fSlots[likely]->GetName() == name) {
+    if (likely != TLikelySlots::kNone && TNameText::HasSameSpelling(fSlots[likely]->GetName(), name)) {
         return likely;
     }
     const auto isNamed = [&](std::uint32_t slot) { return TNameText::Equal(fSlots[slot]->GetName(), name); };

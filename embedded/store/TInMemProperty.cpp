@@ -1,18 +1,71 @@
+// Which property of which instance an object is.
+//
+// Instances have properties by the million, so a property must not take a word to say this. Its virtual table says it: each
+// position in a row has a class of its own, whose only difference is the number in GetPlace. From the position follows where the
+// row begins, and in front of the row is the instance or the head of the late block. The tables are 80 bytes for each position,
+// once for all instances.
+
 #include "embedded/store/TInMemProperty.h"
 
-#include "embedded/store/TInMemBlock.h"
+#include <array>
+#include <new>
+#include <utility>
+
 #include "embedded/store/TInMemClass.h"
 #include "embedded/store/TInMemInstance.h"
+#include "embedded/store/TInMemLateBlock.h"
 
 namespace NORVZEL20 {
 
-TInMemProperty::TInMemProperty(std::uint32_t slot, std::uint32_t position, const TCIMValue& value) noexcept
-    : fValue(value), fSlot(slot), fPosition(position & 0x3fffffffU), fChanged(0), fRemoved(0)
-{}
+template <std::uint32_t kPosition>
+class TInMemProperty::TBehindInstance final : public TInMemProperty {
+  public:
+    using TInMemProperty::TInMemProperty;
 
-TInMemInstance& TInMemProperty::GetInstance() const noexcept
+  private:
+    TPlace GetPlace() const noexcept override { return {&TInMemInstance::GetOwner(*(this - kPosition)), kPosition}; }
+};
+
+template <std::uint32_t kPosition>
+class TInMemProperty::TInLateBlock final : public TInMemProperty {
+  public:
+    using TInMemProperty::TInMemProperty;
+
+  private:
+    TPlace GetPlace() const noexcept override
+    {
+        const TInMemLateBlock& block = TInMemLateBlock::GetBlock(*(this - kPosition));
+        return {&block.GetInstance(), block.GetFirst() + kPosition};
+    }
+};
+
+struct TInMemProperty::TMakers {
+    using TMaker = void (*)(void*, TCIMValue::TCIMType) noexcept;
+
+    template <class TProperty>
+    static void Make(void* memory, TCIMValue::TCIMType type) noexcept
+    {
+        static_assert(sizeof(TProperty) == sizeof(TInMemProperty), "the row is one of TInMemProperty");
+        new (memory) TProperty(type);
+    }
+    template <template <std::uint32_t> class TProperty, std::uint32_t... kPositions>
+    static constexpr std::array<TMaker, sizeof...(kPositions)> List(std::integer_sequence<std::uint32_t, kPositions...>)
+    {
+        return {&Make<TProperty<kPositions>>...};
+    }
+};
+
+void TInMemProperty::MakeBehindInstance(void* memory, std::uint32_t position, TCIMValue::TCIMType type) noexcept
 {
-    return TInMemBlock::GetOwner(*this, fPosition);
+    static constexpr auto kMakers =
+        TMakers::List<TBehindInstance>(std::make_integer_sequence<std::uint32_t, kMostBehindInstance>());
+    kMakers[position](memory, type);
+}
+
+void TInMemProperty::MakeInLateBlock(void* memory, std::uint32_t position, TCIMValue::TCIMType type) noexcept
+{
+    static constexpr auto kMakers = TMakers::List<TInLateBlock>(std::make_integer_sequence<std::uint32_t, kMostInLateBlock>());
+    kMakers[position](memory, type);
 }
 
 const TCIMValue& TInMemProperty::GetValue(TCallContext) const
@@ -22,66 +75,51 @@ const TCIMValue& TInMemProperty::GetValue(TCallContext) const
 
 void TInMemProperty::SetValue(const TCIMValue& value, TCallContext)
 {
-    Change(Fit(TCIMValue(value)), false);
-}
-
-void TInMemProperty::SetValue(TCIMValue&& value)
-{
-    Change(Fit(std::move(value)), false);
+    const TPlace place = GetPlace();
+    place.instance->SetSlot(place.slot, value);
 }
 
 void TInMemProperty::MarkRemoved()
 {
-    fRemoved = 1;
+    const TPlace place = GetPlace();
+    place.instance->MarkRemoved(place.slot);
 }
 
 void TInMemProperty::MarkChanged(const TCIMValue& value)
 {
-    Change(Fit(TCIMValue(value)), true);
+    const TPlace place = GetPlace();
+    place.instance->MarkChanged(place.slot, place.instance->Fit(place.slot, TCIMValue(value)));
 }
 
 void TInMemProperty::MarkStandIn(TCIMValue value)
 {
-    Change(std::move(value), true);
+    const TPlace place = GetPlace();
+    place.instance->MarkChanged(place.slot, std::move(value));
 }
 
-TCIMValue TInMemProperty::Fit(TCIMValue&& value) const
-{
-    const TInMemInstance& instance = GetInstance();
-    return instance.GetInMemClass()->GetLayout().GetDecl(fSlot).Fit(std::move(value), &instance);
-}
-
-/// Everything that may fail comes first: the caller has checked the new value, and the old one is kept if it will be asked for.
-/// Then the value is set.
-void TInMemProperty::Change(TCIMValue&& fitting, bool isMarked)
-{
-    TInMemInstance& instance = GetInstance();
-    const TInMemPropertyDecl& decl = instance.GetInMemClass()->GetLayout().GetDecl(fSlot);
-    // The index of the extent finds the instance by the key that it was added with.
-    if (instance.IsAdded() && decl.IsKey()) {
-        instance.KeepKey(fSlot, fValue);
-    }
-    if (isMarked && !fChanged) {
-        instance.KeepEarlier(fSlot, fValue);
-        fChanged = 1;
-    }
-    fValue = std::move(fitting);
-}
-
-/// Unlike Change this keeps no earlier value and no key, because the value still means the same.
+/// Unlike the others this keeps no earlier value and no key, because the value still means the same.
 void TInMemProperty::Rewrite(TCIMValue value)
 {
-    fValue = Fit(std::move(value));
+    const TPlace place = GetPlace();
+    fValue = place.instance->Fit(place.slot, std::move(value));
 }
 
 boost::shared_ptr<const ICIMPropertyDecl> TInMemProperty::GetPropertyDecl(TCallContext) const
 {
-    return GetInstance().GetInMemClass()->GetLayout().GetSharedDecl(fSlot);
+    const TPlace place = GetPlace();
+    return place.instance->GetInMemClass()->GetLayout().GetSharedDecl(place.slot);
+}
+
+bool TInMemProperty::IsRemoved() const noexcept
+{
+    const TPlace place = GetPlace();
+    return place.instance->IsMarkedRemoved(place.slot);
 }
 
 const TCIMValue* TInMemProperty::GetEarlierValue() const noexcept
 {
-    return fChanged ? GetInstance().FindEarlier(fSlot) : nullptr;
+    const TPlace place = GetPlace();
+    return place.instance->FindEarlier(place.slot);
 }
 
 }  // namespace NORVZEL20

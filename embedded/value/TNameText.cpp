@@ -1,7 +1,6 @@
 #include "embedded/value/TNameText.h"
 
 #include <algorithm>
-#include <cstring>
 
 namespace NORVZEL20 {
 
@@ -18,7 +17,7 @@ bool TNameText::Equal(std::string_view a, std::string_view b) noexcept
         return false;
     }
     // Most names come in the spelling of their declaration.
-    if (std::memcmp(a.data(), b.data(), a.size()) == 0) {
+    if (HasSameSpelling(a, b)) {
         return true;
     }
     return std::equal(a.begin(), a.end(), b.begin(), [](char x, char y) { return ToLower(x) == ToLower(y); });

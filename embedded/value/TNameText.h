@@ -2,6 +2,7 @@
 
 #include <cstddef>
 #include <cstdint>
+#include <cstring>
 #include <map>
 #include <string>
 #include <string_view>
@@ -27,6 +28,25 @@ class CIMDELTA_EXPORT TNameText {
     /// Whether a name may go on with `c`: a digit or what IsNameStart accepts.
     static constexpr bool IsNamePart(char c) noexcept { return IsNameStart(c) || (c >= '0' && c <= '9'); }
     static bool Equal(std::string_view a, std::string_view b) noexcept;
+    /// Whether both are the same bytes.
+    static bool HasSameSpelling(std::string_view a, std::string_view b) noexcept
+    {
+        using TWord = std::uint64_t;
+        if (a.size() != b.size()) {
+            return false;
+        }
+        if (a.size() < sizeof(TWord) || a.size() > 2 * sizeof(TWord)) {
+            return a.empty() || std::memcmp(a.data(), b.data(), a.size()) == 0;
+        }
+        // Most names take two words, which may overlap.
+        const auto load = [](std::string_view text, std::size_t position) {
+            TWord word;
+            std::memcpy(&word, text.data() + position, sizeof word);
+            return word;
+        };
+        const std::size_t second = a.size() - sizeof(TWord);
+        return ((load(a, 0) ^ load(b, 0)) | (load(a, second) ^ load(b, second))) == 0;
+    }
     /// Negative, zero or positive, as the bytes of the lower-case forms compare.
     static int Compare(std::string_view a, std::string_view b) noexcept;
     /// The same for names that are Equal. All 32 bits are usable.

@@ -14,6 +14,22 @@ TEST(NameTextTest, NamesThatDifferInLetterCaseAreEqualAndHashAlike)
     EXPECT_FALSE(TNameText::Equal("CIM_Disk", "CIM_Disc"));
 }
 
+TEST(NameTextTest, ASpellingIsTheSameIfEachByteIs)
+{
+    EXPECT_TRUE(TNameText::HasSameSpelling("", std::string_view()));
+    EXPECT_FALSE(TNameText::HasSameSpelling("CIM_Disk", "CIM_Disk2"));
+    for (std::size_t length = 1; length < 40; ++length) {
+        const std::string name(length, 'a');
+        EXPECT_TRUE(TNameText::HasSameSpelling(name, std::string(length, 'a')));
+        for (std::size_t at = 0; at < length; ++at) {
+            std::string other = name;
+            other[at] = 'A';
+            EXPECT_FALSE(TNameText::HasSameSpelling(name, other)) << other;
+            EXPECT_TRUE(TNameText::Equal(name, other)) << other;
+        }
+    }
+}
+
 TEST(NameTextTest, OnlyAsciiLettersFold)
 {
     EXPECT_FALSE(TNameText::Equal("\xC3\x84", "\xC3\xA4"));
