@@ -17,6 +17,7 @@
 namespace NORVZEL20 {
 
 class TInMemExtent;
+class TInMemGroup;
 class TInMemNamespace;
 
 /// A class of an in-memory namespace.
@@ -160,6 +161,8 @@ class CIMDELTA_EXPORT TInMemClass final : public TInMemNamedElement<ICIMClass>, 
     TInMemExtent* fExtent = nullptr;  // the namespace's; null while the class is not declared there
     std::vector<boost::weak_ptr<TInMemClass>> fSubClasses;
     std::vector<boost::weak_ptr<TInMemClass>> fAssociations;  // added by AddAssociationClass
+    boost::weak_ptr<TInMemGroup> fGroup;                      // the last one; its instances hold it
+    std::uint32_t fPlaces = 0;  // in all groups so far, as far as the size of the next one depends on it
     TInMemLayout fLayout;
     TInMemMethodSet fMethods;
 };

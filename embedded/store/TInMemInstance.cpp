@@ -1,9 +1,6 @@
-// How an instance lies in memory.
+// The properties of an instance.
 //
-//   [ counts of the shared pointer | TInMemInstance | property | property | ... ]
-//
-// All this is one allocation, of the size that the class has slots at that moment, and reading a property follows no pointer. The
-// property in slot n stands at position n behind the instance. When the class gets a property later, the instance cannot grow in
+// Most stand behind the instance (TInMemGroup.cpp draws this). When the class gets a property later, the instance cannot grow in
 // place, because handles point into it. A late block then holds slots that are missing; it is made when one of them is first
 // asked for, for all slots that the class has by then. So most instances have none, few have one, and an instance has another only
 // if the class grows again or has very many properties. Late blocks and notes are kept in the extras, which most instances do
@@ -17,9 +14,9 @@
 
 #include "embedded/store/TInMemClass.h"
 #include "embedded/store/TInMemExtent.h"
+#include "embedded/store/TInMemGroup.h"
 #include "embedded/store/TInMemLateBlock.h"
 #include "embedded/store/TInMemNamespace.h"
-#include "embedded/store/TPlacedAllocator.h"
 #include "embedded/store/TStoreRefusal.h"
 
 namespace NORVZEL20 {
@@ -50,23 +47,11 @@ TInMemProperty* TInMemInstance::GetOwnProperties() const noexcept
     return reinterpret_cast<TInMemProperty*>(const_cast<TInMemInstance*>(this) + 1);
 }
 
-boost::shared_ptr<TInMemInstance> TInMemInstance::Create(boost::shared_ptr<TInMemClass> cls)
-{
-    // One allocation for everything. The allocator puts the counts of the shared pointer in front of the instance.
-    using TAllocator = TPlacedAllocator<TInMemInstance>;
-    const std::uint32_t slots = std::min(cls->GetLayout().GetSlotCount(), TInMemProperty::kMostBehindInstance);
-    const std::size_t size = TAllocator::kPlace + sizeof(TInMemInstance) + slots * sizeof(TInMemProperty);
-    char* const block = static_cast<char*>(::operator new(size));
-    TInMemInstance* const instance = new (block + TAllocator::kPlace) TInMemInstance(std::move(cls), slots);
-    const auto destroy = [](TInMemInstance* made) { made->~TInMemInstance(); };
-    return boost::shared_ptr<TInMemInstance>(instance, destroy, TAllocator(block));
-}
-
-TInMemInstance::TInMemInstance(boost::shared_ptr<TInMemClass> cls, std::uint32_t slots) noexcept
-    : fClass(std::move(cls)), fSlots(slots & 0x7fffffffU), fAdded(0)
+TInMemInstance::TInMemInstance(const TInMemLayout& layout, std::uint8_t slots, std::uint8_t position) noexcept
+    : fSlots(slots), fPosition(position)
 {
     for (std::uint32_t slot = 0; slot < slots; ++slot) {
-        TInMemProperty::MakeBehindInstance(GetOwnProperties() + slot, slot, fClass->GetLayout().GetDecl(slot).GetType());
+        TInMemProperty::MakeBehindInstance(GetOwnProperties() + slot, slot, layout.GetDecl(slot).GetType());
     }
 }
 
@@ -77,26 +62,41 @@ TInMemInstance::~TInMemInstance()
     }
 }
 
+const boost::shared_ptr<TInMemClass>& TInMemInstance::GetInMemClass() const noexcept
+{
+    return TInMemGroup::GetGroup(*this, fPosition).GetClass();
+}
+
+const TInMemLayout& TInMemInstance::GetLayout() const noexcept
+{
+    return GetInMemClass()->GetLayout();
+}
+
+boost::shared_ptr<const TInMemInstance> TInMemInstance::GetSelf() const
+{
+    return boost::shared_ptr<const TInMemInstance>(TInMemGroup::GetGroup(*this, fPosition).shared_from_this(), this);
+}
+
 void TInMemInstance::Validate(TCallContext) const
 {
-    fClass->GetExtent().Check(*this);
+    GetInMemClass()->GetExtent().Check(*this);
 }
 
 void TInMemInstance::AddToNamespace(TCallContext)
 {
-    fClass->GetExtent().Add(shared_from_this());
+    GetInMemClass()->GetExtent().Add(boost::const_pointer_cast<TInMemInstance>(GetSelf()));
 }
 
 TCIMReference TInMemInstance::GetReference() const
 {
-    const auto ns = fClass->GetInMemNamespace();
+    const auto ns = GetInMemClass()->GetInMemNamespace();
     TCIMReference path(ns, std::map<std::string, TCIMValue>());
     // The class keeps the name of its namespace, which completes the path.
     if (!ns) {
-        path.SetNamespaceName(fClass->GetNamespaceName());
+        path.SetNamespaceName(GetInMemClass()->GetNamespaceName());
     }
-    path.SetClass(fClass);
-    const TInMemLayout& layout = fClass->GetLayout();
+    path.SetClass(GetInMemClass());
+    const TInMemLayout& layout = GetLayout();
     for (const std::uint32_t slot : layout.GetKeys()) {
         path.AddKeyValue(layout.GetDecl(slot).GetName(), GetAddedKey(slot));
     }
@@ -110,13 +110,13 @@ TCIMReference TInMemInstance::GetReference(TCallContext) const
 
 boost::shared_ptr<ICIMClass> TInMemInstance::GetClass(TCallContext) const
 {
-    return fClass;
+    return GetInMemClass();
 }
 
 /// A static property lives in its declaration, any other one in the instance; the handle keeps that object alive.
 boost::shared_ptr<ICIMProperty> TInMemInstance::GetHandle(std::uint32_t slot, boost::shared_ptr<const TInMemInstance> self) const
 {
-    const auto& decl = fClass->GetLayout().GetSharedDecl(slot);
+    const auto& decl = GetLayout().GetSharedDecl(slot);
     if (decl->IsStatic()) {
         return boost::shared_ptr<ICIMProperty>(decl, &decl->GetStaticProperty());
     }
@@ -125,18 +125,18 @@ boost::shared_ptr<ICIMProperty> TInMemInstance::GetHandle(std::uint32_t slot, bo
 
 boost::shared_ptr<ICIMProperty> TInMemInstance::GetProperty(const std::string& name, TCallContext) const
 {
-    const std::uint32_t slot = fClass->GetLayout().FindSlot(name);
+    const std::uint32_t slot = GetLayout().FindSlot(name);
     if (slot == TInMemLayout::kNoSlot) {
         throw TStoreRefusal(TZELStatusCode::kNotFound,
                             [&] { return "property " + name + " of instance " + TStoreRefusal::Shown(GetReference()); });
     }
-    return GetHandle(slot, shared_from_this());
+    return GetHandle(slot, GetSelf());
 }
 
 void TInMemInstance::EnumerateProperties(const boost::function<bool(boost::shared_ptr<ICIMProperty>)>& callback, TCallContext) const
 {
-    const auto self = shared_from_this();
-    const std::vector<std::uint32_t>& order = fClass->GetLayout().GetOrder();
+    const boost::shared_ptr<const TInMemInstance> self = GetSelf();
+    const std::vector<std::uint32_t>& order = GetLayout().GetOrder();
     // The loop goes by position, because the callback may add properties to the class.
     for (std::size_t at = 0; at < order.size(); ++at) {
         if (!callback(GetHandle(order[at], self))) {
@@ -147,8 +147,8 @@ void TInMemInstance::EnumerateProperties(const boost::function<bool(boost::share
 
 TInMemProperty* TInMemInstance::FindProperty(std::string_view name) const
 {
-    const std::uint32_t slot = fClass->GetLayout().FindSlot(name);
-    if (slot == TInMemLayout::kNoSlot || fClass->GetLayout().GetDecl(slot).IsStatic()) {
+    const std::uint32_t slot = GetLayout().FindSlot(name);
+    if (slot == TInMemLayout::kNoSlot || GetLayout().GetDecl(slot).IsStatic()) {
         return nullptr;
     }
     return &GetSlotProperty(slot);
@@ -161,13 +161,13 @@ TInMemProperty& TInMemInstance::GetSlotProperty(std::uint32_t slot) const
 
 const TCIMValue& TInMemInstance::GetSlotValue(std::uint32_t slot) const
 {
-    const auto& decl = fClass->GetLayout().GetSharedDecl(slot);
+    const auto& decl = GetLayout().GetSharedDecl(slot);
     return decl->IsStatic() ? decl->GetStaticProperty().GetValue() : GetSlotProperty(slot).GetValue();
 }
 
 void TInMemInstance::SetSlot(std::uint32_t slot, TCIMValue value)
 {
-    const auto& decl = fClass->GetLayout().GetSharedDecl(slot);
+    const auto& decl = GetLayout().GetSharedDecl(slot);
     if (decl->IsStatic()) {
         decl->GetStaticProperty().SetValue(value);
         return;
@@ -177,8 +177,8 @@ void TInMemInstance::SetSlot(std::uint32_t slot, TCIMValue value)
 
 const std::string* TInMemInstance::FindMissingKey() const
 {
-    for (const std::uint32_t slot : fClass->GetLayout().GetKeys()) {
-        const TInMemPropertyDecl& decl = fClass->GetLayout().GetDecl(slot);
+    for (const std::uint32_t slot : GetLayout().GetKeys()) {
+        const TInMemPropertyDecl& decl = GetLayout().GetDecl(slot);
         if (!decl.IsGenerated() && GetSlotValue(slot).IsNull()) {
             return &decl.GetName();
         }
@@ -205,7 +205,7 @@ TInMemProperty& TInMemInstance::GetLateProperty(std::uint32_t slot) const
         }
     }
     while (slot >= end) {
-        lateBlocks.push_back(TInMemLateBlock::Make(const_cast<TInMemInstance&>(*this), fClass->GetLayout(), end));
+        lateBlocks.push_back(TInMemLateBlock::Make(const_cast<TInMemInstance&>(*this), GetLayout(), end));
         end = lateBlocks.back()->GetEnd();
     }
     return lateBlocks.back()->GetProperty(slot - lateBlocks.back()->GetFirst());
@@ -213,7 +213,7 @@ TInMemProperty& TInMemInstance::GetLateProperty(std::uint32_t slot) const
 
 TCIMValue TInMemInstance::Fit(std::uint32_t slot, TCIMValue&& value) const
 {
-    return fClass->GetLayout().GetDecl(slot).Fit(std::move(value), this);
+    return GetLayout().GetDecl(slot).Fit(std::move(value), this);
 }
 
 /// Everything that may fail comes first: the caller has checked the new value, and the old one is kept if it will be asked for.
@@ -222,7 +222,7 @@ void TInMemInstance::Change(std::uint32_t slot, TCIMValue&& fitting)
 {
     TInMemProperty& property = GetSlotProperty(slot);
     // The index of the extent finds the instance by the key that it was added with.
-    if (fAdded != 0 && fClass->GetLayout().GetDecl(slot).IsKey() && !GetExtras().Find(TExtras::EAbout::kAddedKey, slot)) {
+    if (fAdded && GetLayout().GetDecl(slot).IsKey() && !GetExtras().Find(TExtras::EAbout::kAddedKey, slot)) {
         fExtras->notes.push_back({slot, TExtras::EAbout::kAddedKey, property.fValue});
     }
     property.fValue = std::move(fitting);
@@ -269,12 +269,12 @@ const TCIMValue& TInMemInstance::GetAddedKey(std::uint32_t slot) const
 void TInMemInstance::SetAdded(std::uint32_t keyHash) noexcept
 {
     fKeyHash = keyHash;
-    fAdded = 1;
+    fAdded = true;
 }
 
 void TInMemInstance::SetRemoved() noexcept
 {
-    fAdded = 0;
+    fAdded = false;
     if (fExtras) {
         // Outside of an extent the present keys count.
         const auto isKey = [](const TExtras::TNote& note) { return note.about == TExtras::EAbout::kAddedKey; };

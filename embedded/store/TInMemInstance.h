@@ -1,6 +1,6 @@
 #pragma once
 
-#include <boost/smart_ptr/enable_shared_from_this.hpp>
+#include <boost/smart_ptr/shared_ptr.hpp>
 #include <cstdint>
 #include <memory>
 #include <string>
@@ -13,17 +13,16 @@
 namespace NORVZEL20 {
 
 class TInMemClass;
+class TInMemGroup;
+class TInMemLayout;
 
-/// An instance in memory: one block with the shared pointer's counts, the instance and its properties.
+/// An instance in memory, with its properties behind it. It lives in a TInMemGroup, which holds its class.
 ///
 /// TInMemClass::AllocateInMemInstance makes it. A property that the class gets later is made when it is first asked for, and so are
-/// those beyond the first TInMemProperty::kMostBehindInstance. Handles
-/// stay valid when the instance is deleted and when the namespace goes; AddToNamespace then throws kNamespaceGone (18).
-/// Threads: as the namespace, reading included.
-class CIMDELTA_EXPORT TInMemInstance final : public ICIMInstance, public boost::enable_shared_from_this<TInMemInstance> {
+/// those beyond the first TInMemProperty::kMostBehindInstance. Handles stay valid when the instance is deleted and when the
+/// namespace goes; AddToNamespace then throws kNamespaceGone (18). Threads: as the namespace, reading included.
+class CIMDELTA_EXPORT TInMemInstance final : public ICIMInstance {
   public:
-    /// An instance of `cls` with every property null.
-    static boost::shared_ptr<TInMemInstance> Create(boost::shared_ptr<TInMemClass> cls);
     TInMemInstance(const TInMemInstance&) = delete;
     TInMemInstance& operator=(const TInMemInstance&) = delete;
     ~TInMemInstance() override;
@@ -41,7 +40,7 @@ class CIMDELTA_EXPORT TInMemInstance final : public ICIMInstance, public boost::
 
     /// As the operations above, without context.
     TCIMReference GetReference() const;
-    const boost::shared_ptr<TInMemClass>& GetInMemClass() const noexcept { return fClass; }
+    const boost::shared_ptr<TInMemClass>& GetInMemClass() const noexcept;
     /// The instance's own property of that name; null if the class declares none, and for a static one. Valid while the instance
     /// lives.
     TInMemProperty* FindProperty(std::string_view name) const;
@@ -53,7 +52,7 @@ class CIMDELTA_EXPORT TInMemInstance final : public ICIMInstance, public boost::
     void SetSlot(std::uint32_t slot, TCIMValue value);
 
     /// Whether it is part of the namespace.
-    bool IsAdded() const noexcept { return fAdded != 0; }
+    bool IsAdded() const noexcept { return fAdded; }
     /// The name of the first key without a value, which keeps the instance from being added; null if there is none.
     const std::string* FindMissingKey() const;
     /// The value of a key as it was when the instance was added, which counts while the instance is in the namespace.
@@ -74,6 +73,9 @@ class CIMDELTA_EXPORT TInMemInstance final : public ICIMInstance, public boost::
     void MarkRemoved(std::uint32_t slot);
     bool IsMarkedRemoved(std::uint32_t slot) const noexcept;
 
+    /// The bytes that an instance takes together with `slots` properties behind it.
+    static std::size_t GetSize(std::uint32_t slots) noexcept { return sizeof(TInMemInstance) + slots * sizeof(TInMemProperty); }
+    std::size_t GetSize() const noexcept { return GetSize(fSlots); }
     /// The instance that the row of properties beginning with `first` stands behind.
     static TInMemInstance& GetOwner(const TInMemProperty& first) noexcept
     {
@@ -83,10 +85,13 @@ class CIMDELTA_EXPORT TInMemInstance final : public ICIMInstance, public boost::
 
   private:
     friend class TInMemExtent;  // the owner: it alone says whether the instance is part of the namespace
+    friend class TInMemGroup;   // the maker: it provides the memory
 
     struct TExtras;  // what few instances have
 
-    TInMemInstance(boost::shared_ptr<TInMemClass> cls, std::uint32_t slots) noexcept;
+    TInMemInstance(const TInMemLayout& layout, std::uint8_t slots, std::uint8_t position) noexcept;
+    boost::shared_ptr<const TInMemInstance> GetSelf() const;
+    const TInMemLayout& GetLayout() const noexcept;
     TInMemProperty* GetOwnProperties() const noexcept;
     boost::shared_ptr<ICIMProperty> GetHandle(std::uint32_t slot, boost::shared_ptr<const TInMemInstance> self) const;
     TExtras& GetExtras() const;
@@ -94,11 +99,13 @@ class CIMDELTA_EXPORT TInMemInstance final : public ICIMInstance, public boost::
     void SetAdded(std::uint32_t keyHash) noexcept;
     void SetRemoved() noexcept;
 
-    boost::shared_ptr<TInMemClass> fClass;
     mutable std::unique_ptr<TExtras> fExtras;
     std::uint32_t fKeyHash = 0;
-    std::uint32_t fSlots : 31;  // whose properties stand behind the instance
-    std::uint32_t fAdded : 1;
+    std::uint8_t fSlots;     // whose properties stand behind the instance
+    std::uint8_t fPosition;  // in its group
+    bool fAdded = false;
 };
+
+static_assert(sizeof(TInMemInstance) == 24, "what all instances of a group share is kept in the group");
 
 }  // namespace NORVZEL20
