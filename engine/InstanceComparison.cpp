@@ -1,3 +1,5 @@
+#include <utility>
+
 #include "engine/TCIMDiffEngine.h"
 #include "spec/TDiffClassRules.h"
 
@@ -11,7 +13,7 @@
 
 namespace NORVZEL20 {
 
-bool TCIMDiffEngine::IsDifferent(boost::shared_ptr<TDiffClassRules> rules, const TCIMValue& master, const TCIMValue& other)
+bool TCIMDiffEngine::IsDifferent(const boost::shared_ptr<TDiffClassRules>& rules, const TCIMValue& master, const TCIMValue& other)
 {
     if (master.GetType() != TCIMValue::TCIMType::kReference) {
         return !(master == other);
@@ -29,7 +31,8 @@ void TCIMDiffEngine::compare(boost::shared_ptr<TDiffClassRules> rules, boost::sh
                              std::map<std::string, std::map<std::string, std::vector<int>>>& differences,
                              unsigned int namespaceIndex)
 {
-    bool changed = false;
+    // The entry of this key, from the first difference on. Keys usually come in ascending order, so it is likely to be the last.
+    auto changed = differences.end();
     for (const std::string& name : properties) {
         const boost::shared_ptr<ICIMProperty> masterProperty = master->GetProperty(name, TCallContext());
         const boost::shared_ptr<ICIMProperty> otherProperty = other->GetProperty(name, TCallContext());
@@ -38,15 +41,17 @@ void TCIMDiffEngine::compare(boost::shared_ptr<TDiffClassRules> rules, boost::sh
         if (!IsDifferent(rules, masterValue, otherValue)) {
             continue;
         }
-        differences[key][name].push_back(static_cast<int>(namespaceIndex));
-        changed = true;
+        if (changed == differences.end()) {
+            changed = differences.try_emplace(changed, std::move(key));
+        }
+        changed->second[name].push_back(static_cast<int>(namespaceIndex));
         if (namespaces.size() == 2) {
             masterProperty->MarkChanged(otherValue);
         }
     }
-    if (changed && rules->hasExcludedKeys()) {
-        AliasInstance(*master, key, 0);
-        AliasInstance(*other, key, namespaceIndex);
+    if (changed != differences.end() && rules->hasExcludedKeys()) {
+        AliasInstance(*master, changed->first, 0);
+        AliasInstance(*other, changed->first, namespaceIndex);
     }
 }
 

@@ -17,12 +17,7 @@ namespace NORVZEL20 {
 
 namespace {
 
-TCIMReference MakeKeylessPath(boost::shared_ptr<ICIMClass> cls)
-{
-    TCIMReference path(boost::shared_ptr<ICIMNamespace>{}, std::map<std::string, TCIMValue>{});
-    path.SetClass(cls);
-    return path;
-}
+constexpr std::size_t kUsualKeyCount = 4;  // a class with more keys is no error
 
 }  // namespace
 
@@ -31,9 +26,11 @@ std::string TCIMDiffEngine::buildPath(boost::shared_ptr<TDiffClassRules> rules, 
     // Keeps the class alive, because the pointers to its key names are used below.
     const boost::shared_ptr<ICIMClass> cls = instance->GetClass(TCallContext());
     std::vector<const std::string*> names;
+    names.reserve(kUsualKeyCount);
     cls->EnumerateKeyNames(TAddKeyNamesToVectorCallback(&names), TCallContext());
 
-    TCIMReference path = MakeKeylessPath(instance->GetClass(TCallContext()));
+    TCIMReference path(boost::shared_ptr<ICIMNamespace>{}, std::map<std::string, TCIMValue>{});
+    path.SetClass(instance->GetClass(TCallContext()));
     for (const std::string* name : names) {
         if (!rules->isKeyExcluded(*name)) {
             path.AddKeyValue(*name, instance->GetProperty(*name, TCallContext())->GetValue(TCallContext()));
@@ -47,7 +44,8 @@ std::string TCIMDiffEngine::buildPath(boost::shared_ptr<TDiffClassRules> rules, 
     if (!rules->hasExcludedKeys()) {
         return path.GetPath();
     }
-    TCIMReference rebuilt = MakeKeylessPath(path.GetClass());
+    TCIMReference rebuilt(boost::shared_ptr<ICIMNamespace>{}, std::map<std::string, TCIMValue>{});
+    rebuilt.SetClass(path.GetClass());
     std::map<std::string, TCIMValue> bindings;
     path.EnumerateKeyBindings(TAddKeyBindingsToMapCallback(&bindings));
     for (const auto& [name, value] : bindings) {

@@ -4,6 +4,7 @@
 #include <utility>
 
 #include "engine/TClassComparison.h"
+#include "engine/TMapCursor.h"
 #include "engine/TMasterInstance.h"
 #include "host/RootClassName.h"
 #include "host/TAddToVectorCallback.h"
@@ -91,8 +92,12 @@ void TCIMDiffEngine::buildInstanceMap(boost::shared_ptr<TDiffClassRules> rules,
                                       std::vector<boost::shared_ptr<ICIMInstance>>& instances,
                                       std::map<std::string, TMasterInstance>& masterMap)
 {
+    TMapCursor<std::map<std::string, TMasterInstance>> place(masterMap);
     for (const boost::shared_ptr<ICIMInstance>& instance : instances) {
-        masterMap.emplace(buildPath(rules, instance), TMasterInstance{instance});
+        TMasterInstance& master = place.FindOrAdd(buildPath(rules, instance)).second;
+        if (!master.instance) {
+            master.instance = instance;
+        }
     }
 }
 

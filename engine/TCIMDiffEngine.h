@@ -98,7 +98,7 @@ class CIMDELTA_INTERNAL_EXPORT TCIMDiffEngine {
     /// Whether two values of a property differ: references by the texts of their paths (see buildPath), all other values by
     /// TCIMValue::operator==. The type is that of `master`, the reference's value.
     /// Errors: kTypeMismatch (13) if `master` is a path and `other` has another type and is not null.
-    bool IsDifferent(boost::shared_ptr<TDiffClassRules> rules, const TCIMValue& master, const TCIMValue& other);
+    bool IsDifferent(const boost::shared_ptr<TDiffClassRules>& rules, const TCIMValue& master, const TCIMValue& other);
 
     /// The names of the properties to compare. If the default is to exclude: the included properties, in ascending order. If it is
     /// to include: all properties of the class in the class's order, without the excluded ones and DateTimeOfCollection.
@@ -140,6 +140,7 @@ class CIMDELTA_INTERNAL_EXPORT TCIMDiffEngine {
   private:
     friend struct TTestAccess;
     class TClassComparison;
+    class TInstanceWalk;
 
     void CheckOperatingSystems();
     void CompareSubClasses(ICIMClass& cls);

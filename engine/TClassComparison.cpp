@@ -3,7 +3,7 @@
 #include <string>
 #include <utility>
 
-#include "engine/TCompareInstances.h"
+#include "engine/TInstanceWalk.h"
 #include "engine/TMessageStream.h"
 #include "host/TAddToVectorCallback.h"
 #include "host/TRootObject.h"
@@ -86,9 +86,10 @@ void TCIMDiffEngine::TClassComparison::CompareWithNamespace(std::size_t index)
     if (!FindClassIn(index)) {
         return;
     }
-    TCompareInstances compareInstances(&fEngine, fRules, &fMaster, &fMissing, &fDifferences, static_cast<unsigned int>(index),
-                                       &fProperties);
-    fOtherClass->EnumerateInstances(compareInstances, false, TCallContext());
+    const TCompareInstances compareInstances(&fEngine, fRules, &fMaster, &fMissing, &fDifferences, static_cast<unsigned int>(index),
+                                             &fProperties);
+    TInstanceWalk::TState state{TMasterCursor(fMaster), TIndicesCursor(fMissing)};
+    fOtherClass->EnumerateInstances(TInstanceWalk(compareInstances, &state), false, TCallContext());
     NoteAbsentInstances(index);
 }
 
@@ -121,9 +122,10 @@ void TCIMDiffEngine::TClassComparison::FailWithoutClassIn(std::size_t index) con
 
 void TCIMDiffEngine::TClassComparison::NoteAbsentInstances(std::size_t index)
 {
+    TIndicesCursor absent(fAbsent);
     for (auto& [key, master] : fMaster) {
         if (master.found == 0) {
-            fAbsent[key].push_back(static_cast<int>(index));
+            absent.FindOrAdd(std::string(key)).second.push_back(static_cast<int>(index));
         }
         // The next namespace starts with no instance found.
         master.found = 0;
@@ -144,22 +146,25 @@ void TCIMDiffEngine::TClassComparison::CreateClassRecord()
 
 void TCIMDiffEngine::TClassComparison::RecordAbsentInstances(bool excludesKeys)
 {
+    TMasterCursor masters(fMaster);
     for (const auto& [key, indices] : fAbsent) {
-        RecordAbsentInstance(key, indices, excludesKeys);
+        const ICIMInstance& instance = *masters.Find(key)->second.instance;
+        RecordAbsentInstance(key, instance, indices, excludesKeys);
         if (HasTwoNamespaces()) {
-            MarkPropertiesRemoved(*fMaster.at(key).instance);
+            MarkPropertiesRemoved(instance);
         }
     }
 }
 
 /// If keys are excluded, the record names the instance by its whole path, because several instances may share the key.
-void TCIMDiffEngine::TClassComparison::RecordAbsentInstance(const std::string& key, const TIndices& indices, bool excludesKeys)
+void TCIMDiffEngine::TClassComparison::RecordAbsentInstance(const std::string& key, const ICIMInstance& instance,
+                                                            const TIndices& indices, bool excludesKeys)
 {
     if (!excludesKeys) {
         fEngine.createCIMDiff(fClassRecord, TDeltaNamespace::kInstanceRemoved, key, "", indices);
         return;
     }
-    const TCIMReference path = fMaster.at(key).instance->GetReference(TCallContext());
+    const TCIMReference path = instance.GetReference(TCallContext());
     fEngine.createObjectPathAlias(fClassName, key, path, 0);
     fEngine.createCIMDiff(fClassRecord, TDeltaNamespace::kInstanceRemoved, path.GetPath(), "", indices);
 }
@@ -171,11 +176,13 @@ void TCIMDiffEngine::TClassComparison::RecordMissingInstances()
         std::vector<boost::shared_ptr<ICIMInstance>> instances = GetInstances(*fOtherClass);
         fEngine.buildInstanceMap(fRules, instances, others);
     }
+    TMasterCursor place(others);
     for (const auto& [key, indices] : fMissing) {
         fEngine.createCIMDiff(fClassRecord, TDeltaNamespace::kInstanceAdded, key, "", indices);
         if (HasTwoNamespaces()) {
             // If the other namespace has no such instance any more, this adds a null pointer, which fails the host's assertion.
-            CopyToReference(others[key].instance);
+            const auto* const other = place.Find(key);
+            CopyToReference(other != nullptr ? other->second.instance : nullptr);
         }
     }
 }

@@ -1,6 +1,7 @@
 #pragma once
 
 #include "engine/TCIMDiffEngine.h"
+#include "engine/TMapCursor.h"
 #include "engine/TMasterInstance.h"
 
 namespace NORVZEL20 {
@@ -15,6 +16,8 @@ class TCIMDiffEngine::TClassComparison {
 
   private:
     using TIndices = std::vector<int>;
+    using TMasterCursor = TMapCursor<std::map<std::string, TMasterInstance>>;
+    using TIndicesCursor = TMapCursor<std::map<std::string, TIndices>>;
 
     void CollectReferenceInstances();
     void CompareWithNamespace(std::size_t index);
@@ -24,7 +27,7 @@ class TCIMDiffEngine::TClassComparison {
     bool IsAnythingDifferent() const;
     void CreateClassRecord();
     void RecordAbsentInstances(bool excludesKeys);
-    void RecordAbsentInstance(const std::string& key, const TIndices& indices, bool excludesKeys);
+    void RecordAbsentInstance(const std::string& key, const ICIMInstance& instance, const TIndices& indices, bool excludesKeys);
     void RecordMissingInstances();
     void RecordDifferences();
     void CopyToReference(boost::shared_ptr<ICIMInstance> instance);

@@ -16,23 +16,40 @@ TCIMDiffEngine::TCompareInstances::TCompareInstances(TCIMDiffEngine* engine, boo
       fNamespaceIndex(namespaceIndex), fPropertyList(propertyList)
 {}
 
+std::string TCIMDiffEngine::TCompareInstances::BuildKey(const boost::shared_ptr<ICIMInstance>& instance)
+{
+    return fEngine->buildPath(fRules, instance);
+}
+
 bool TCIMDiffEngine::TCompareInstances::operator()(boost::shared_ptr<ICIMInstance> instance)
 {
-    const std::string key = fEngine->buildPath(fRules, instance);
+    std::string key = BuildKey(instance);
     const auto master = fMasterMap->find(key);
     if (master != fMasterMap->end()) {
-        master->second.found = 1;
-        fEngine->compare(fRules, master->second.instance, instance, key, *fPropertyList, *fDifferenceMap, fNamespaceIndex);
+        Match(master->second, std::move(key), std::move(instance));
         return true;
     }
-    (*fMissingMap)[key].push_back(static_cast<int>(fNamespaceIndex));
+    const auto missing = fMissingMap->try_emplace(std::move(key)).first;
+    NoteMissing(missing->first, missing->second, *instance);
+    return true;
+}
+
+void TCIMDiffEngine::TCompareInstances::Match(TMasterInstance& master, std::string key, boost::shared_ptr<ICIMInstance> instance)
+{
+    master.found = 1;
+    fEngine->compare(fRules, master.instance, std::move(instance), std::move(key), *fPropertyList, *fDifferenceMap,
+                     fNamespaceIndex);
+}
+
+void TCIMDiffEngine::TCompareInstances::NoteMissing(const std::string& key, std::vector<int>& indices, const ICIMInstance& instance)
+{
+    indices.push_back(static_cast<int>(fNamespaceIndex));
     if (fRules->hasExcludedKeys()) {
         // The key may stand for several instances. Its alias names the first one.
-        const TCIMReference path = instance->GetReference(TCallContext());
-        const boost::shared_ptr<ICIMClass> cls = instance->GetClass(TCallContext());
+        const TCIMReference path = instance.GetReference(TCallContext());
+        const boost::shared_ptr<ICIMClass> cls = instance.GetClass(TCallContext());
         fEngine->createObjectPathAlias(cls->GetName(TCallContext()), key, path, fNamespaceIndex);
     }
-    return true;
 }
 
 }  // namespace NORVZEL20

@@ -21,6 +21,13 @@ class TCIMDiffEngine::TCompareInstances : public TUnaryFunction<boost::shared_pt
     /// missing from the reference. Always returns true, so the enumeration continues.
     bool operator()(boost::shared_ptr<ICIMInstance> instance);
 
+  protected:
+    std::string BuildKey(const boost::shared_ptr<ICIMInstance>& instance);
+    /// For a key that the reference has: `master` is its entry.
+    void Match(TMasterInstance& master, std::string key, boost::shared_ptr<ICIMInstance> instance);
+    /// For a key that the reference lacks: `indices` are those of its entry in the missing map.
+    void NoteMissing(const std::string& key, std::vector<int>& indices, const ICIMInstance& instance);
+
   private:
     TCIMDiffEngine* fEngine;
     boost::shared_ptr<TDiffClassRules> fRules;
