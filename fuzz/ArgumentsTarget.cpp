@@ -22,7 +22,7 @@ namespace {
 /// Keeps the result and the messages of a command.
 class TKeptConsole : public IConsole {
   public:
-    void WriteResult(const std::string& text) override { fResult += text; }
+    void WriteResult(std::string_view piece) override { fResult += piece; }
     void Say(std::string_view line) noexcept override
     {
         const std::lock_guard<std::mutex> lock(fMutex);

@@ -1,7 +1,6 @@
 #include "client/files/TTemporaryFile.h"
 
-#include <stdlib.h>
-
+#include "client/files/BeginOfTemporaryFiles.h"
 #include "client/process/TClientError.h"
 #include "client/process/WriteWhole.h"
 
@@ -10,13 +9,6 @@ namespace NORVZEL20 {
 namespace {
 
 const char kAdvice[] = "; TMPDIR names the folder";
-
-std::string Begin()
-{
-    // An empty TMPDIR counts as none.
-    const char* folder = getenv("TMPDIR");
-    return std::string(folder == nullptr || *folder == '\0' ? "/tmp" : folder) + "/cimdelta-";
-}
 
 std::unique_ptr<TUnfinishedFile> MakeNamedFile(const std::string& begin)
 {
@@ -34,7 +26,7 @@ TTemporaryFile::TTemporaryFile(const std::string& content) : fAnonymous(TAnonymo
     if (fAnonymous) {
         return;
     }
-    fNamed = MakeNamedFile(Begin());
+    fNamed = MakeNamedFile(BeginOfTemporaryFiles());
     try {
         WriteWhole(fNamed->GetDescriptor(), content);
         fNamed->Close();

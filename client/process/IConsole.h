@@ -1,6 +1,5 @@
 #pragma once
 
-#include <string>
 #include <string_view>
 
 namespace NORVZEL20 {
@@ -12,9 +11,9 @@ class IConsole {
   public:
     virtual ~IConsole() = default;
 
-    /// Writes a whole result to standard output. Errors: TReaderGone if the reader has closed the pipe or standard output is
-    /// closed; TClientError if it cannot be written for another reason.
-    virtual void WriteResult(const std::string& text) = 0;
+    /// Writes the next piece of a result to standard output. Errors: TReaderGone if the reader has closed the pipe or standard
+    /// output is closed; TClientError if it cannot be written for another reason.
+    virtual void WriteResult(std::string_view piece) = 0;
 
     /// Writes a line to standard error, escaped as by EscapeForDisplay; `line` comes without its end. Works without memory too:
     /// then "?" stands for everything that is not printable ASCII.

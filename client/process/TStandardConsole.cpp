@@ -47,9 +47,9 @@ TStandardConsole::TStandardConsole()
     : fColored(IsTerminal(STDOUT_FILENO) && !IsSet("NO_COLOR")), fProgress(IsTerminal(STDERR_FILENO))
 {}
 
-void TStandardConsole::WriteResult(const std::string& text)
+void TStandardConsole::WriteResult(std::string_view piece)
 {
-    const std::error_code error = TryWriteWhole(STDOUT_FILENO, text);
+    const std::error_code error = TryWriteWhole(STDOUT_FILENO, piece);
     // If standard output was closed from the start, nobody wants the result. If it is open for reading only, that is a mistake.
     if (error == std::errc::broken_pipe || (error == std::errc::bad_file_descriptor && IsClosed(STDOUT_FILENO))) {
         throw TReaderGone();

@@ -11,7 +11,7 @@ class TStandardConsole : public IConsole {
   public:
     TStandardConsole();
 
-    void WriteResult(const std::string& text) override;
+    void WriteResult(std::string_view piece) override;
     void Say(std::string_view line) noexcept override;
     bool IsColored() const override { return fColored; }
     void ShowProgress(std::string_view text) noexcept override;

@@ -10,7 +10,7 @@ namespace NORVZEL20 {
 /// Keeps what a command writes, for the test to read.
 class TFakeConsole : public IConsole {
   public:
-    void WriteResult(const std::string& text) override { fOut += text; }
+    void WriteResult(std::string_view piece) override { fOut += piece; }
     void Say(std::string_view line) noexcept override
     {
         const std::lock_guard<std::mutex> lock(fMutex);

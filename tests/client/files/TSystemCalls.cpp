@@ -88,6 +88,7 @@ extern "C" {
 
 int __real_open(const char* path, int flags, ...);
 ssize_t __real_read(int descriptor, void* buffer, std::size_t size);
+ssize_t __real_pread(int descriptor, void* buffer, std::size_t size, off_t at);
 ssize_t __real_write(int descriptor, const void* buffer, std::size_t size);
 int __real_memfd_create(const char* name, unsigned int flags);
 int __real_mkostemp(char* path, int flags);
@@ -104,6 +105,11 @@ int __wrap_open(const char* path, int flags, mode_t mode)
 ssize_t __wrap_read(int descriptor, void* buffer, std::size_t size)
 {
     return Do("read", [&] { return __real_read(descriptor, buffer, TSystemCalls::Limit(size)); });
+}
+
+ssize_t __wrap_pread(int descriptor, void* buffer, std::size_t size, off_t at)
+{
+    return Do("pread", [&] { return __real_pread(descriptor, buffer, TSystemCalls::Limit(size), at); });
 }
 
 ssize_t __wrap_write(int descriptor, const void* buffer, std::size_t size)

@@ -19,8 +19,8 @@ class TSystemCalls {
     TSystemCalls& operator=(const TSystemCalls&) = delete;
     ~TSystemCalls();
 
-    /// The `number`-th call of that name (from 1) fails with `error`: open, read, memfd_create, mkostemp, write, fchmod, fsync,
-    /// close, rename.
+    /// The `number`-th call of that name (from 1) fails with `error`: open, read, pread, memfd_create, mkostemp, write, fchmod,
+    /// fsync, close, rename.
     void Fail(const std::string& call, int number, int error);
     /// From now on a read or write transfers at most so many bytes.
     void LimitPieces(std::size_t length) { fPiece = length; }

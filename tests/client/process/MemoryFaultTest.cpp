@@ -26,7 +26,7 @@ const int kAllCame = 10;
 /// Keeps what a command writes, without allocating.
 class TFixedConsole : public IConsole {
   public:
-    void WriteResult(const std::string& text) override { Append(fOut, fOutLength, text); }
+    void WriteResult(std::string_view piece) override { Append(fOut, fOutLength, piece); }
     void Say(std::string_view line) noexcept override
     {
         Append(fErr, fErrLength, line);

@@ -1,0 +1,94 @@
+#include "client/files/TSpooledText.h"
+
+#include <fcntl.h>
+#include <stdlib.h>
+#include <unistd.h>
+
+#include <algorithm>
+#include <array>
+#include <new>
+
+#include "client/files/BeginOfTemporaryFiles.h"
+#include "client/process/SystemError.h"
+#include "client/process/TClientError.h"
+#include "client/process/TSignalsHeld.h"
+#include "client/process/WriteWhole.h"
+
+namespace NORVZEL20 {
+
+namespace {
+
+const std::size_t kReadAtOnce = 65536;
+
+// A file that is in no folder any more; -1 if there can be none.
+int OpenNamelessFile() noexcept
+{
+    try {
+        std::string path = BeginOfTemporaryFiles() + "XXXXXX";
+        // A signal that ended the process in between would leave the name behind.
+        const TSignalsHeld held;
+        const int descriptor = mkostemp(&path[0], O_CLOEXEC);
+        if (descriptor >= 0) {
+            unlink(path.c_str());
+        }
+        return descriptor;
+    } catch (const std::bad_alloc&) {
+        return -1;
+    }
+}
+
+}  // namespace
+
+TSpooledText::~TSpooledText()
+{
+    if (fDescriptor >= 0) {
+        close(fDescriptor);
+    }
+}
+
+void TSpooledText::Append(std::string_view piece)
+{
+    if (fTail.size() + piece.size() > kMostInMemory && !fIsFileClosed) {
+        MoveToFile();
+    }
+    fTail += piece;
+}
+
+void TSpooledText::MoveToFile() noexcept
+{
+    if (fDescriptor < 0) {
+        fDescriptor = OpenNamelessFile();
+    }
+    if (fDescriptor < 0 || TryWriteWhole(fDescriptor, fTail)) {
+        fIsFileClosed = true;
+        return;
+    }
+    fInFile += fTail.size();
+    fTail.clear();
+}
+
+void TSpooledText::ForEachPiece(const TCallback& callback) const
+{
+    ReadFile(callback);
+    if (!fTail.empty()) {
+        callback(fTail);
+    }
+}
+
+void TSpooledText::ReadFile(const TCallback& callback) const
+{
+    std::array<char, kReadAtOnce> buffer;
+    for (std::uint64_t at = 0; at < fInFile;) {
+        const std::size_t most = static_cast<std::size_t>(std::min<std::uint64_t>(buffer.size(), fInFile - at));
+        const ssize_t count = pread(fDescriptor, buffer.data(), most, static_cast<off_t>(at));
+        const std::error_code reason = count == 0 ? std::make_error_code(std::errc::io_error) : LastSystemError();
+        if (count > 0) {
+            callback(std::string_view(buffer.data(), static_cast<std::size_t>(count)));
+            at += static_cast<std::uint64_t>(count);
+        } else if (reason != std::errc::interrupted) {
+            throw TClientError("the temporary file of the result cannot be read", reason);
+        }
+    }
+}
+
+}  // namespace NORVZEL20

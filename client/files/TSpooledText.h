@@ -1,0 +1,43 @@
+#pragma once
+
+#include <cstddef>
+#include <cstdint>
+#include <functional>
+#include <string>
+#include <string_view>
+
+namespace NORVZEL20 {
+
+/// A text that is put together piece by piece, and read from its beginning when it is complete.
+///
+/// About kMostInMemory bytes of it are in memory, the rest in a temporary file (see BeginOfTemporaryFiles). The file has no name,
+/// so nothing of it is left however the process ends. If none can be made, or if it takes no more, the rest stays in memory.
+class TSpooledText {
+  public:
+    /// A text of up to this size makes no file.
+    static constexpr std::size_t kMostInMemory = 1U << 20U;
+
+    using TCallback = std::function<void(std::string_view)>;
+
+    TSpooledText() = default;
+    TSpooledText(const TSpooledText&) = delete;
+    TSpooledText& operator=(const TSpooledText&) = delete;
+    ~TSpooledText();
+
+    /// Errors: std::bad_alloc; the text is as before then.
+    void Append(std::string_view piece);
+
+    /// Calls back with the whole text, piece by piece. Errors: TClientError if the file cannot be read; what the callback throws.
+    void ForEachPiece(const TCallback& callback) const;
+
+  private:
+    void MoveToFile() noexcept;
+    void ReadFile(const TCallback& callback) const;
+
+    std::string fTail;           // what is behind the text in the file
+    std::uint64_t fInFile = 0;   // the length of the text in the file; more may be there, of a piece that did not fit
+    int fDescriptor = -1;        // of the file, if there is one
+    bool fIsFileClosed = false;  // whether nothing more is put into the file
+};
+
+}  // namespace NORVZEL20
