@@ -3,7 +3,7 @@
 #include "client/inventory/CompleteInventories.h"
 #include "client/inventory/TInventoryLoader.h"
 #include "client/process/ExitStatus.h"
-#include "client/report/ResultOutput.h"
+#include "client/report/TResultOutput.h"
 #include "client/report/TRulesListing.h"
 #include "client/rules/ReadRules.h"
 

@@ -7,7 +7,7 @@
 #include "client/report/CimXmlFormat.h"
 #include "client/report/DescribeNothingCompared.h"
 #include "client/report/JsonFormat.h"
-#include "client/report/ResultOutput.h"
+#include "client/report/TResultOutput.h"
 #include "client/report/TTextFormat.h"
 #include "client/rules/ReadRules.h"
 

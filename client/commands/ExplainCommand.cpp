@@ -4,7 +4,7 @@
 #include "client/inventory/TInventoryLoader.h"
 #include "client/process/ExitStatus.h"
 #include "client/process/TClientError.h"
-#include "client/report/ResultOutput.h"
+#include "client/report/TResultOutput.h"
 #include "client/report/TRulesListing.h"
 #include "client/rules/MadeRules.h"
 #include "client/rules/ReadRules.h"

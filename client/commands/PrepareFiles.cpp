@@ -2,7 +2,7 @@
 
 #include "client/inventory/CheckInventoryFiles.h"
 #include "client/inventory/DropRepeatedFiles.h"
-#include "client/report/ResultOutput.h"
+#include "client/report/TResultOutput.h"
 
 namespace NORVZEL20 {
 

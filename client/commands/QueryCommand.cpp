@@ -5,7 +5,7 @@
 #include "client/process/ExitStatus.h"
 #include "client/process/TClientError.h"
 #include "client/report/InstanceListing.h"
-#include "client/report/ResultOutput.h"
+#include "client/report/TResultOutput.h"
 #include "embedded/query/TQuery.h"
 #include "embedded/query/TQueryError.h"
 

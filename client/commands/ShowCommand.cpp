@@ -5,7 +5,7 @@
 #include "client/inventory/TInventoryLoader.h"
 #include "client/process/ExitStatus.h"
 #include "client/report/InstanceListing.h"
-#include "client/report/ResultOutput.h"
+#include "client/report/TResultOutput.h"
 
 namespace NORVZEL20 {
 

@@ -6,8 +6,9 @@
 //   a device or a pipe    is opened and written to;
 //   an ordinary file      is replaced: the text goes to a temporary file in the same folder (a rename cannot leave its file
 //                         system), which gets the old file's owner and rights, is synced, and takes the name over by rename().
-// A failure, or the end of the process, before the rename leaves the old file as it was.
-#include "client/report/ResultOutput.h"
+// A failure, or the end of the process, before the rename leaves the old file as it was. Descriptors, devices and pipes get nothing
+// before the result is complete, and neither does standard output: their text waits in a TSpooledText.
+#include "client/report/TResultOutput.h"
 
 #include <fcntl.h>
 #include <limits.h>
@@ -16,10 +17,9 @@
 #include <unistd.h>
 
 #include <charconv>
-#include <optional>
+#include <utility>
 
 #include "client/files/TFileIdentity.h"
-#include "client/files/TUnfinishedFile.h"
 #include "client/process/SystemError.h"
 #include "client/process/TClientError.h"
 #include "client/process/TReaderGone.h"
@@ -31,6 +31,8 @@ namespace {
 
 // Linux follows as many links in one path.
 const int kMostLinks = 40;
+
+const std::size_t kWrittenAtOnce = 65536;
 
 // The folder of a path, with the slash behind it; empty for the current one.
 std::string FolderOf(const std::string& path)
@@ -90,18 +92,6 @@ bool IsSpecial(const std::string& path)
     return stat(path.c_str(), &status) == 0 && !S_ISREG(status.st_mode);
 }
 
-void WriteSpecial(const std::string& path, const std::string& text)
-{
-    const int descriptor = open(path.c_str(), O_WRONLY | O_CLOEXEC);
-    ThrowIfFailed(descriptor);
-    const std::error_code writing = TryWriteWhole(descriptor, text);
-    const int closed = close(descriptor);
-    if (writing) {
-        throw std::system_error(writing);
-    }
-    ThrowIfFailed(closed);
-}
-
 // Gives the file the owner and the rights of the one that it replaces. If there is none, gives it the rights that any new file
 // would have: a temporary file has fewer.
 void SetRights(int descriptor, const std::string& target)
@@ -119,29 +109,6 @@ void SetRights(int descriptor, const std::string& target)
         mode = 0666 & ~mask;
     }
     ThrowIfFailed(fchmod(descriptor, mode));
-}
-
-void ReplaceFile(const std::string& target, const std::string& text)
-{
-    // A short name of its own: the final name may be as long as names can be and leave no room for a suffix.
-    TUnfinishedFile file(FolderOf(target) + ".cimdelta-");
-    WriteWhole(file.GetDescriptor(), text);
-    SetRights(file.GetDescriptor(), target);
-    ThrowIfFailed(fsync(file.GetDescriptor()));
-    file.Close();
-    file.MoveTo(target);
-}
-
-void WriteTo(const std::string& path, const std::string& text)
-{
-    const TTarget target = FollowLinks(path);
-    if (target.descriptor) {
-        WriteWhole(*target.descriptor, text);
-    } else if (IsSpecial(path)) {
-        WriteSpecial(path, text);
-    } else {
-        ReplaceFile(target.path, text);
-    }
 }
 
 void CheckAccess(const std::string& path, int mode)
@@ -234,17 +201,100 @@ void CheckOutput(const std::string& path, const std::vector<std::string>& inputs
     }
 }
 
-void DeliverResult(IConsole& console, const std::string& path, const std::string& text)
+TResultOutput::TResultOutput(IConsole& console, std::string path) : fConsole(console), fPath(std::move(path))
 {
-    if (IsStandardOutput(path)) {
-        console.WriteResult(text);
+    if (IsStandardOutput(fPath)) {
         return;
     }
     try {
-        WriteTo(path, text);
+        const TTarget target = FollowLinks(fPath);
+        fTarget = target.path;
+        fDescriptor = target.descriptor;
+        if (!fDescriptor && !IsSpecial(fPath)) {
+            // A short name of its own: the final name may be as long as names can be and leave no room for a suffix.
+            fFile = std::make_unique<TUnfinishedFile>(FolderOf(fTarget) + ".cimdelta-");
+        }
     } catch (const std::system_error& error) {
-        RefuseToWrite(path, error);
+        RefuseToWrite(fPath, error);
     }
+}
+
+void TResultOutput::Write(std::string_view piece)
+{
+    if (!fFile) {
+        fText.Append(piece);
+        return;
+    }
+    if (fPiece.size() + piece.size() > kWrittenAtOnce) {
+        WriteToFile();
+    }
+    fPiece += piece;
+}
+
+void TResultOutput::WriteToFile()
+{
+    try {
+        WriteWhole(fFile->GetDescriptor(), fPiece);
+    } catch (const std::system_error& error) {
+        RefuseToWrite(fPath, error);
+    }
+    fPiece.clear();
+}
+
+void TResultOutput::Deliver(std::string_view end)
+{
+    try {
+        if (IsStandardOutput(fPath)) {
+            ForEachPiece(end, [this](std::string_view piece) { fConsole.WriteResult(piece); });
+        } else if (fFile) {
+            ReplaceFile(end);
+        } else if (fDescriptor) {
+            WriteTo(*fDescriptor, end);
+        } else {
+            WriteSpecial(end);
+        }
+    } catch (const std::system_error& error) {
+        RefuseToWrite(fPath, error);
+    }
+}
+
+void TResultOutput::ForEachPiece(std::string_view end, const TSpooledText::TCallback& callback) const
+{
+    fText.ForEachPiece(callback);
+    callback(end);
+}
+
+void TResultOutput::WriteTo(int descriptor, std::string_view end) const
+{
+    ForEachPiece(end, [descriptor](std::string_view piece) { WriteWhole(descriptor, piece); });
+}
+
+void TResultOutput::WriteSpecial(std::string_view end) const
+{
+    const int descriptor = open(fPath.c_str(), O_WRONLY | O_CLOEXEC);
+    ThrowIfFailed(descriptor);
+    try {
+        WriteTo(descriptor, end);
+    } catch (...) {
+        close(descriptor);
+        throw;
+    }
+    ThrowIfFailed(close(descriptor));
+}
+
+void TResultOutput::ReplaceFile(std::string_view end)
+{
+    WriteToFile();
+    WriteWhole(fFile->GetDescriptor(), end);
+    SetRights(fFile->GetDescriptor(), fTarget);
+    ThrowIfFailed(fsync(fFile->GetDescriptor()));
+    fFile->Close();
+    fFile->MoveTo(fTarget);
+}
+
+void DeliverResult(IConsole& console, const std::string& path, std::string_view text)
+{
+    TResultOutput(console, path).Deliver(text);
 }
 
 }  // namespace NORVZEL20
