@@ -4,6 +4,7 @@
 #include "client/inventory/TInventoryLoader.h"
 #include "client/process/ExitStatus.h"
 #include "client/process/TClientError.h"
+#include "client/process/TProgress.h"
 #include "client/report/CimXmlFormat.h"
 #include "client/report/DescribeNothingCompared.h"
 #include "client/report/JsonFormat.h"
@@ -15,19 +16,29 @@ namespace NORVZEL20 {
 
 namespace {
 
-std::string Write(const TComparisonReport& report, EOutputFormat format, bool colored)
+void Write(const TComparisonReport& report, const TCompareOptions& options, IConsole& console, const TTextSink& sink)
 {
-    switch (format) {
+    switch (options.format) {
     case EOutputFormat::kJson:
-        return WriteJsonReport(report);
+        return WriteJsonReport(report, sink);
     case EOutputFormat::kNdjson:
-        return WriteNdjsonReport(report);
+        return WriteNdjsonReport(report, sink);
     case EOutputFormat::kCimXml:
-        return WriteCimXmlReport(report);
+        return WriteCimXmlReport(report, sink);
     case EOutputFormat::kText:
         break;
     }
-    return TTextFormat(report, colored).Write();
+    TTextFormat(report, console.IsColored() && IsStandardOutput(options.output)).Write(sink);
+}
+
+void Deliver(const TComparisonReport& report, const TCompareOptions& options, IConsole& console)
+{
+    TResultOutput output(console, options.output);
+    {
+        const TProgress progress(console, "writing the report");
+        Write(report, options, console, [&output](std::string_view piece) { output.Write(piece); });
+    }
+    output.Deliver();
 }
 
 }  // namespace
@@ -43,8 +54,8 @@ int RunCompare(const TCompareOptions& options, IConsole& console)
     if (!options.allowEmpty && report.coverage.IsNothingCompared()) {
         throw TClientError(DescribeNothingCompared(report, options.rules, options.strictSchema));
     }
-    DeliverResult(console, options.output, Write(report, options.format, console.IsColored() && IsStandardOutput(options.output)));
-    return report.differences.empty() ? kExitSuccess : kExitDifferences;
+    Deliver(report, options, console);
+    return report.differences->GetCounts().GetTotal() == 0 ? kExitSuccess : kExitDifferences;
 }
 
 }  // namespace NORVZEL20

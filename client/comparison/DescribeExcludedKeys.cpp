@@ -14,6 +14,7 @@
 #include <algorithm>
 #include <iterator>
 #include <set>
+#include <unordered_map>
 
 #include "client/comparison/TInstanceIndex.h"
 #include "client/inventory/CollectObjects.h"
@@ -25,6 +26,8 @@ namespace NORVZEL20 {
 
 namespace {
 
+using TInstances = TInstanceIndex::TInstances;
+
 // Gathers over the inventories what becomes part of the coverage of one class.
 class TExcludedKeys {
   public:
@@ -33,14 +36,14 @@ class TExcludedKeys {
     void Describe(const std::vector<TInventory>& inventories, const std::vector<std::string>& compared)
     {
         FindIgnoredKeys(inventories);
-        const TInstanceIndex reference(*inventories[0].ns, fClass.name, fRules);
-        CountSharing(reference, 0, reference);
+        TInstanceIndex reference(*inventories[0].ns, fClass.name, fRules);
+        reference.ForEachKey(
+            [this](const std::string&, const TInstances& instances) { fClass.sharing[0] += instances.size() - 1; });
         for (std::size_t i = 1; i < inventories.size(); ++i) {
-            const TInstanceIndex other(*inventories[i].ns, fClass.name, fRules);
-            CountSharing(other, i, reference);
             FindReferences({inventories[0].ns, inventories[i].ns}, compared);
-            MatchReferences(other, reference);
-            CollectAlone(other, reference);
+            const TInstanceIndex other(*inventories[i].ns, fClass.name, fRules);
+            other.ForEachKey(
+                [&](const std::string& key, const TInstances& instances) { Describe(i, key, instances, reference.Find(key)); });
         }
         for (const auto& [key, instances] : fAlone) {
             MatchReferencesAmong(instances, compared);
@@ -80,25 +83,19 @@ class TExcludedKeys {
         return decl && decl->GetType() == TCIMValue::TCIMType::kReference;
     }
 
-    void CountSharing(const TInstanceIndex& index, std::size_t inventory, const TInstanceIndex& reference)
+    // The instances of one inventory that have the key, and those of the reference.
+    void Describe(std::size_t inventory, const std::string& key, const TInstances& instances, const TInstances& masters)
     {
-        for (const auto& [key, instances] : index.GetAll()) {
-            const std::size_t sharing = instances.size() - 1;
-            fClass.sharing[inventory] += sharing;
-            fClass.sharingAlone[inventory] += reference.Find(key).empty() ? sharing : 0;
-        }
-    }
-
-    void MatchReferences(const TInstanceIndex& other, const TInstanceIndex& reference)
-    {
-        if (fReferences.empty()) {
+        const std::size_t sharing = instances.size() - 1;
+        fClass.sharing[inventory] += sharing;
+        if (masters.empty()) {
+            fClass.sharingAlone[inventory] += sharing;
+            TInstances& alone = fAlone[key];
+            alone.insert(alone.end(), instances.begin(), instances.end());
             return;
         }
-        for (const auto& [key, instances] : other.GetAll()) {
-            const TInstanceIndex::TInstances& masters = reference.Find(key);
-            for (std::size_t i = 0; i < instances.size() && !masters.empty(); ++i) {
-                MatchReferences(*instances[i], *masters.front());
-            }
+        for (std::size_t i = 0; i < instances.size() && !fReferences.empty(); ++i) {
+            MatchReferences(*instances[i], *masters.front());
         }
     }
 
@@ -114,17 +111,7 @@ class TExcludedKeys {
         }
     }
 
-    void CollectAlone(const TInstanceIndex& other, const TInstanceIndex& reference)
-    {
-        for (const auto& [key, instances] : other.GetAll()) {
-            if (reference.Find(key).empty()) {
-                TInstanceIndex::TInstances& alone = fAlone[key];
-                alone.insert(alone.end(), instances.begin(), instances.end());
-            }
-        }
-    }
-
-    void MatchReferencesAmong(const TInstanceIndex::TInstances& instances, const std::vector<std::string>& compared)
+    void MatchReferencesAmong(const TInstances& instances, const std::vector<std::string>& compared)
     {
         for (std::size_t i = 0; instances.size() > 1 && i < compared.size(); ++i) {
             std::vector<TCIMValue> references;
@@ -167,7 +154,8 @@ class TExcludedKeys {
     TRules& fRules;
     std::vector<std::string> fReferences;     // the reference properties compared between two inventories
     std::set<std::string> fKeysInReferences;  // the excluded keys met in references
-    TInstanceIndex::TByKey fAlone;            // the instances of the others whose key the reference lacks
+    // The instances of the others whose key the reference lacks, by that key.
+    std::unordered_map<std::string, TInstances> fAlone;
 };
 
 }  // namespace

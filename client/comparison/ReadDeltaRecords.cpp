@@ -31,28 +31,10 @@ std::string TextOf(const ICIMInstance& instance, const char* property)
     return std::string(ValueOf(instance, property).GetString());
 }
 
-TDeltaRecord MakeRecord(const ICIMInstance& delta)
-{
-    TDeltaRecord record;
-    record.type = static_cast<TDeltaNamespace::EDeltaType>(ValueOf(delta, kDeltaRecordType).GetUnsigned());
-    record.instanceName = TextOf(delta, kDeltaRecordInstance);
-    record.property = TextOf(delta, kDeltaRecordProperty);
-    const TCIMValue indices = ValueOf(delta, kDeltaRecordIndices);
-    for (const TCIMValue& index : indices.GetElements()) {
-        record.inventories.push_back(index.GetUnsigned());
-    }
-    // With excluded keys a position occurs once for each instance that shares the key.
-    std::sort(record.inventories.begin(), record.inventories.end());
-    record.inventories.erase(std::unique(record.inventories.begin(), record.inventories.end()), record.inventories.end());
-    return record;
-}
-
 // Follows associations to both ends and keeps the records by class.
 class TAssociationReader {
   public:
-    TAssociationReader(TDeltaNamespace& ns, std::map<std::string, std::vector<TDeltaRecord>>& records)
-        : fNamespace(ns), fRecords(records)
-    {}
+    TAssociationReader(TDeltaNamespace& ns, std::map<std::string, TDeltaInstances>& records) : fNamespace(ns), fRecords(records) {}
 
     void Read(const ICIMInstance& association)
     {
@@ -63,14 +45,14 @@ class TAssociationReader {
             fCurrent = &fRecords[TextOf(*fNamespace.GetInstance(classPath, TCallContext()), kClassRecordName)];
         }
         const TCIMReference deltaPath = ValueOf(association, kDeltaAssociationDelta);
-        fCurrent->push_back(MakeRecord(*fNamespace.GetInstance(deltaPath, TCallContext())));
+        fCurrent->push_back(fNamespace.GetInstance(deltaPath, TCallContext()));
     }
 
   private:
     TDeltaNamespace& fNamespace;
-    std::map<std::string, std::vector<TDeltaRecord>>& fRecords;
+    std::map<std::string, TDeltaInstances>& fRecords;
     std::string fCurrentPath;
-    std::vector<TDeltaRecord>* fCurrent = nullptr;
+    TDeltaInstances* fCurrent = nullptr;
 };
 
 std::vector<boost::shared_ptr<ICIMInstance>> RecordsOf(TDeltaNamespace& ns, const char* recordClass)
@@ -105,15 +87,46 @@ bool ReduceOrDelete(TDeltaNamespace& ns, const ICIMInstance& association, const 
 
 }  // namespace
 
-std::map<std::string, std::vector<TDeltaRecord>> ReadDeltaRecords(TDeltaNamespace& ns)
+std::map<std::string, TDeltaInstances> CollectDeltaRecords(TDeltaNamespace& ns)
 {
-    std::map<std::string, std::vector<TDeltaRecord>> records;
+    std::map<std::string, TDeltaInstances> records;
     TAssociationReader reader(ns, records);
     EnumerateAll(ns, kDeltaAssociation, [&reader](const boost::shared_ptr<ICIMInstance>& association) {
         reader.Read(*association);
         return true;
     });
     return records;
+}
+
+TDeltaRecord ReadDeltaRecord(const ICIMInstance& delta)
+{
+    TDeltaRecord record;
+    record.type = TypeOfRecord(delta);
+    record.instanceName = TextOf(delta, kDeltaRecordInstance);
+    record.property = TextOf(delta, kDeltaRecordProperty);
+    const TCIMValue indices = ValueOf(delta, kDeltaRecordIndices);
+    for (const TCIMValue& index : indices.GetElements()) {
+        record.inventories.push_back(index.GetUnsigned());
+    }
+    // With excluded keys a position occurs once for each instance that shares the key.
+    std::sort(record.inventories.begin(), record.inventories.end());
+    record.inventories.erase(std::unique(record.inventories.begin(), record.inventories.end()), record.inventories.end());
+    return record;
+}
+
+TDeltaNamespace::EDeltaType TypeOfRecord(const ICIMInstance& delta)
+{
+    return static_cast<TDeltaNamespace::EDeltaType>(ValueOf(delta, kDeltaRecordType).GetUnsigned());
+}
+
+TCIMValue InstanceOfRecord(const ICIMInstance& delta)
+{
+    return ValueOf(delta, kDeltaRecordInstance);
+}
+
+TCIMValue PropertyOfRecord(const ICIMInstance& delta)
+{
+    return ValueOf(delta, kDeltaRecordProperty);
 }
 
 bool ReadLastDeltaRecord(TDeltaNamespace& ns, std::string& className, TDeltaRecord& record)
@@ -124,7 +137,7 @@ bool ReadLastDeltaRecord(TDeltaNamespace& ns, std::string& className, TDeltaReco
         return false;
     }
     className = TextOf(*classes.back(), kClassRecordName);
-    record = MakeRecord(*deltas.back());
+    record = ReadDeltaRecord(*deltas.back());
     return true;
 }
 

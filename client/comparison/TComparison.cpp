@@ -5,7 +5,7 @@
 //     so it gets a temporary file. It holds exactly what was read here: a file could change meanwhile, and standard input is gone.
 // (3) Find out what will be compared. This must be done before the run, which may add instances to the reference.
 // (4) Let the plug-in compare. Its log is captured, because it says more about a failure than the exception does.
-// (5) Read the plug-in's records back as differences with values.
+// (5) List the plug-in's records. They are read back as differences with values when they are written.
 #include "client/comparison/TComparison.h"
 
 #include <algorithm>
@@ -16,7 +16,7 @@
 #include "client/comparison/StaticValues.h"
 #include "client/comparison/TComparisonFault.h"
 #include "client/comparison/TCoverageBuilder.h"
-#include "client/comparison/TDifferenceReader.h"
+#include "client/comparison/TDifferenceList.h"
 #include "client/files/TTemporaryFile.h"
 #include "client/inventory/CompleteInventories.h"
 #include "client/inventory/CountInstances.h"
@@ -81,17 +81,17 @@ TComparisonReport TComparison::Run(const std::optional<TRulesText>& rules, bool 
     const TRulesText text =
         rules ? *rules
               : TRulesText{"the rules made for " + fInventories[0].path, MakeRulesForEverything(fInventories, fNotes), true};
-    TRules meaning(fInventories[0].ns, text);
+    const auto meaning = std::make_shared<TRules>(fInventories[0].ns, text);
     if (!text.isMade) {
-        RefuseRecordKeys(fInventories, meaning, text.name);
+        RefuseRecordKeys(fInventories, *meaning, text.name);
         SayRuleWarnings(
-            fConsole, text.name, meaning.GetDocument(), fInventories[0].ns,
+            fConsole, text.name, meaning->GetDocument(), fInventories[0].ns,
             TSuggestedCommand("check").AddFile(text.name).AddSchemas(fInventories, strictSchema).Advise("shows all of them"));
     }
     return RunWith(meaning, text);
 }
 
-TComparisonReport TComparison::RunWith(TRules& rules, const TRulesText& text)
+TComparisonReport TComparison::RunWith(const std::shared_ptr<TRules>& rules, const TRulesText& text)
 {
     const TProgress progress(fConsole, "comparing");
     TComparisonReport report;
@@ -99,16 +99,16 @@ TComparisonReport TComparison::RunWith(TRules& rules, const TRulesText& text)
         report.labels.push_back(inventory.label);
         report.paths.push_back(inventory.path);
     }
-    report.coverage = TCoverageBuilder(fInventories, rules, fNotes).Build();
-    report.idleRules = text.isMade ? std::vector<std::string>() : FindIdleRules(rules.GetDocument());
+    report.coverage = TCoverageBuilder(fInventories, *rules, fNotes).Build();
+    report.idleRules = text.isMade ? std::vector<std::string>() : FindIdleRules(rules->GetDocument());
     report.records = MakeDeltaNamespace();
-    if (rules.HasExcludedKeys()) {
+    if (rules->HasExcludedKeys()) {
         KeepForever(report.records);
     }
     const TTemporaryFile file(text.text);
     report.records->SetSpecFileName(file.GetPath());
-    FindDifferences(*report.records, rules);
-    report.differences = TDifferenceReader(fInventories, rules).Read(*report.records);
+    FindDifferences(*report.records, *rules);
+    report.differences = std::make_shared<TDifferenceList>(fInventories, rules, *report.records);
     return report;
 }
 

@@ -1,5 +1,6 @@
 #pragma once
 
+#include <memory>
 #include <optional>
 #include <vector>
 
@@ -19,12 +20,12 @@ class TComparison {
     TComparison(std::vector<TInventory>& inventories, IConsole& console) : fInventories(inventories), fConsole(console) {}
 
     /// Compares under `rules`, or without them every class in every property. With `strictSchema` the inventories are not
-    /// completed first. Call this once.
+    /// completed first. Call this once. The differences of the report are valid while the inventories live.
     /// Errors: TClientError; std::bad_alloc.
     TComparisonReport Run(const std::optional<TRulesText>& rules, bool strictSchema);
 
   private:
-    TComparisonReport RunWith(TRules& rules, const TRulesText& text);
+    TComparisonReport RunWith(const std::shared_ptr<TRules>& rules, const TRulesText& text);
     std::vector<std::string> FindIdleRules(const TRulesDocument& document) const;
     void FindDifferences(TDeltaNamespace& records, TRules& rules);
     void RemoveMadeSystems(TDeltaNamespace& records);

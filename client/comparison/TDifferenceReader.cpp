@@ -16,8 +16,6 @@
 #include "client/comparison/TDifferenceReader.h"
 
 #include <algorithm>
-#include <map>
-#include <tuple>
 #include <utility>
 
 #include "client/comparison/EmbeddedParts.h"
@@ -67,42 +65,17 @@ TCIMValue InFormOf(const TInMemPropertyDecl& declared, const TCIMValue& value)
                          : value;
 }
 
-bool StandsBefore(const TDifference& a, const TDifference& b)
-{
-    if (a.kind != TDifference::kChanged || b.kind != TDifference::kChanged) {
-        return std::tie(a.className, a.instance, a.kind) < std::tie(b.className, b.instance, b.kind);
-    }
-    return std::tie(a.className, a.instance, a.values.front().property) <
-           std::tie(b.className, b.instance, b.values.front().property);
-}
-
 }  // namespace
-
-std::vector<TDifference> TDifferenceReader::Read(TDeltaNamespace& records)
-{
-    std::map<std::string, std::vector<TDeltaRecord>> classes = ReadDeltaRecords(records);
-    std::size_t count = 0;
-    for (const auto& ofClass : classes) {
-        count += ofClass.second.size();
-    }
-    std::vector<TDifference> differences;
-    differences.reserve(count);
-    for (auto& ofClass : classes) {
-        StartClass(ofClass.first);
-        for (TDeltaRecord& record : ofClass.second) {
-            differences.push_back(Make(record));
-        }
-    }
-    std::sort(differences.begin(), differences.end(), StandsBefore);
-    return differences;
-}
 
 void TDifferenceReader::StartClass(const std::string& className)
 {
+    if (fClass && className == fClassName) {
+        return;
+    }
     fClassName = className;
     fIndexes.clear();
     fIndexes.resize(fInventories.size());
-    fByPath.clear();
+    fByPath.reset();
     fClass = fInventories[0].ns->FindClass(className);
     fProperties = fRules.PropertiesOf(fClass);
     std::sort(fProperties.begin(), fProperties.end());
@@ -111,9 +84,9 @@ void TDifferenceReader::StartClass(const std::string& className)
     fKeysOf.reset();
 }
 
-// Moves the record's parts into the difference.
-TDifference TDifferenceReader::Make(TDeltaRecord& record)
+TDifference TDifferenceReader::Read(const ICIMInstance& delta)
 {
+    TDeltaRecord record = ReadDeltaRecord(delta);
     TDifference difference;
     difference.className = fClassName;
     difference.instance = std::move(record.instanceName);
@@ -135,7 +108,7 @@ TDifference TDifferenceReader::Make(TDeltaRecord& record)
     case TDeltaNamespace::kPropertyChanged:
         difference.kind = TDifference::kChanged;
         instance = Index(0).Find(difference.instance).at(0);
-        AddChange(difference, std::move(record.property), *instance);
+        AddChange(difference, record.property, *instance);
         break;
     }
     AddKeys(difference, *instance);
@@ -149,15 +122,36 @@ boost::shared_ptr<ICIMInstance> TDifferenceReader::FindByPath(const std::string&
     if (!fExcludesKeys) {
         return Index(0).Find(path).at(0);
     }
-    if (fByPath.empty()) {
-        for (const boost::shared_ptr<ICIMInstance>& instance : InstancesOf(*fClass)) {
-            fByPath[instance->GetReference(TCallContext()).GetPath()] = instance;
-        }
+    if (!fByPath) {
+        fByPath = std::make_unique<TInstanceIndex>(fClass, [](const boost::shared_ptr<ICIMInstance>& instance) {
+            return instance->GetReference(TCallContext()).GetPath();
+        });
     }
-    return fByPath.at(path);
+    return fByPath->Find(path).at(0);
 }
 
-const TInstanceIndex& TDifferenceReader::Index(std::size_t inventory)
+TCIMValue TDifferenceReader::KeyOf(const ICIMInstance& record)
+{
+    const TCIMValue name = InstanceOfRecord(record);
+    return fExcludesKeys && TypeOfRecord(record) == TDeltaNamespace::kInstanceRemoved
+               ? TCIMValue(fRules.KeyOf(fClassName, FindByPath(std::string(name.GetString()))))
+               : name;
+}
+
+std::size_t TDifferenceReader::CountInstances(const ICIMInstance& record)
+{
+    if (!fExcludesKeys) {
+        return 1;
+    }
+    const TDeltaRecord added = ReadDeltaRecord(record);
+    std::size_t most = 1;
+    for (const std::size_t inventory : added.inventories) {
+        most = std::max(most, Index(inventory).Find(added.instanceName).size());
+    }
+    return most;
+}
+
+TInstanceIndex& TDifferenceReader::Index(std::size_t inventory)
 {
     std::unique_ptr<TInstanceIndex>& index = fIndexes.at(inventory);
     if (!index) {
@@ -184,11 +178,11 @@ void TDifferenceReader::AddKeys(TDifference& difference, const ICIMInstance& ins
 }
 
 // If instances of an inventory share the key, only some of them may differ from the reference.
-void TDifferenceReader::AddChange(TDifference& difference, std::string&& property, const ICIMInstance& reference)
+void TDifferenceReader::AddChange(TDifference& difference, const std::string& property, const ICIMInstance& reference)
 {
     difference.values.resize(1);
     TValueDifference& change = difference.values.front();
-    change.property = std::move(property);
+    change.property = property;
     change.reference = ValueBefore(reference, change.property);
     const TValueDifference::TEqual areEqual = MakeEqual(change.property);
     for (const std::size_t inventory : difference.inventories) {

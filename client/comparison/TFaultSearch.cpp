@@ -54,7 +54,7 @@ TFaultSearch::TCause TFaultSearch::FindRefusedInstance(TDeltaNamespace& records,
         last.type != TDeltaNamespace::kInstanceAdded) {
         return {};
     }
-    const TInstanceIndex index(*fInventories[1].ns, className, fRules);
+    TInstanceIndex index(*fInventories[1].ns, className, fRules);
     const boost::shared_ptr<ICIMInstance> instance = index.Find(last.instanceName).at(0);
     const auto& added = static_cast<const TInMemInstance&>(*instance);  // the client's inventories are in memory
     const boost::shared_ptr<TInMemClass> cls = fInventories[0].ns->FindClass(className);

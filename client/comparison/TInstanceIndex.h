@@ -1,8 +1,10 @@
 #pragma once
 
 #include <boost/smart_ptr/shared_ptr.hpp>
+#include <cstddef>
+#include <functional>
 #include <string>
-#include <unordered_map>
+#include <utility>
 #include <vector>
 
 #include "client/rules/TRules.h"
@@ -11,25 +13,37 @@
 
 namespace NORVZEL20 {
 
-/// The instances of one class of one namespace by their keys, as the rules define them.
+/// The instances of one class of one namespace by their keys, usually as the rules define them. It holds no keys, only their
+/// hashes: 24 bytes for each instance.
 class TInstanceIndex {
   public:
     using TInstances = std::vector<boost::shared_ptr<ICIMInstance>>;
+    using TCallback = std::function<void(const std::string& key, const TInstances& instances)>;
+    using TKeyOf = std::function<std::string(const boost::shared_ptr<ICIMInstance>&)>;
 
-    using TByKey = std::unordered_map<std::string, TInstances>;
-
-    /// Empty if the namespace does not declare the class. Errors: TZELException of the namespace. Cost: one key for each instance.
+    /// Empty if the namespace does not declare the class. `rules` must outlive this, and no key of an instance may change
+    /// meanwhile. Errors: TZELException of the namespace. Cost: one key for each instance.
     TInstanceIndex(ICIMNamespace& ns, const std::string& className, TRules& rules);
 
-    /// The instances with that key, in the order in which they were added to the namespace; several only if keys are excluded.
-    /// Empty for an unknown key. Valid while the index lives.
-    const TInstances& Find(const std::string& key) const;
+    /// The same of any class, which may be null, by any keys.
+    TInstanceIndex(const boost::shared_ptr<ICIMClass>& cls, TKeyOf keyOf);
 
-    /// All instances, in no particular order of their keys. Valid while the index lives.
-    const TByKey& GetAll() const { return fInstances; }
+    /// The instances with that key, in the order in which they were added to the namespace; several only if keys are excluded.
+    /// Empty for an unknown key. Valid until the next call. Cost: one key for each of them, none if the key is that of the last
+    /// call.
+    const TInstances& Find(const std::string& key);
+
+    /// Calls back once for each key, in no particular order. Cost: one key for each instance.
+    void ForEachKey(const TCallback& callback) const;
 
   private:
-    TByKey fInstances;
+    using TEntry = std::pair<std::size_t, boost::shared_ptr<ICIMInstance>>;
+    using TEntries = std::vector<TEntry>;
+
+    const TKeyOf fKeyOf;
+    TEntries fEntries;     // ascending by hash; with the same hash in the order of the namespace
+    std::string fFoundBy;  // the key of the last call of Find, and what it has found
+    TInstances fFound;
 };
 
 }  // namespace NORVZEL20

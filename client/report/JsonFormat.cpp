@@ -23,6 +23,7 @@
 #include "client/report/JsonCoverage.h"
 #include "client/report/JsonDifference.h"
 #include "client/report/JsonValue.h"
+#include "client/report/TJsonDocument.h"
 
 namespace NORVZEL20 {
 
@@ -32,7 +33,7 @@ using TJson = nlohmann::ordered_json;
 
 TJson JsonOfSummary(const TComparisonReport& report)
 {
-    const TComparisonReport::TCounts counts = report.Count();
+    const TDifferenceCounts& counts = report.differences->GetCounts();
     return {{"differences", counts.GetTotal()},
             {"onlyInReference", counts.onlyInReference},
             {"onlyInOthers", counts.onlyInOthers},
@@ -57,30 +58,27 @@ TJson JsonOfInventories(const TComparisonReport& report)
 
 }  // namespace
 
-std::string WriteJsonReport(const TComparisonReport& report)
+void WriteJsonReport(const TComparisonReport& report, const TTextSink& sink)
 {
-    TJson differences = TJson::array();
-    for (const TDifference& difference : report.differences) {
-        differences.push_back(JsonOfDifference(report, difference));
-    }
-    const TJson document = {{"format", "cimdelta-comparison"},
-                            {"version", 1},
-                            {"inventories", JsonOfInventories(report)},
-                            {"summary", JsonOfSummary(report)},
-                            {"differences", differences},
-                            {"coverage", JsonOfCoverage(report)}};
-    return WriteJson(document, true);
+    TJsonDocument document(sink);
+    document.Add("format", "cimdelta-comparison");
+    document.Add("version", 1);
+    document.Add("inventories", JsonOfInventories(report));
+    document.Add("summary", JsonOfSummary(report));
+    document.StartList("differences");
+    report.differences->ForEach([&](const TDifference& difference) { document.AddElement(JsonOfDifference(report, difference)); });
+    document.EndList();
+    document.Add("coverage", JsonOfCoverage(report));
+    document.End();
 }
 
-std::string WriteNdjsonReport(const TComparisonReport& report)
+void WriteNdjsonReport(const TComparisonReport& report, const TTextSink& sink)
 {
-    std::string lines;
-    for (const TDifference& difference : report.differences) {
-        lines += WriteJson(JsonOfDifference(report, difference), false);
-    }
+    report.differences->ForEach(
+        [&](const TDifference& difference) { sink(WriteJson(JsonOfDifference(report, difference), false)); });
     TJson coverage = {{"kind", "coverage"}, {"inventories", JsonOfInventories(report)}, {"summary", JsonOfSummary(report)}};
     coverage.update(JsonOfCoverage(report));
-    return lines + WriteJson(coverage, false);
+    sink(WriteJson(coverage, false));
 }
 
 }  // namespace NORVZEL20

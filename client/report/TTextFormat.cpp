@@ -35,17 +35,16 @@ const char kPlain[] = "\x1b[0m";
 
 }  // namespace
 
-std::string TTextFormat::Write()
+void TTextFormat::Write(const TTextSink& sink) const
 {
-    fOut = Paint(kBold, Summary()) + "\n";
-    WriteDifferences();
-    fOut += "\n" + WriteTextCoverage(fReport);
-    return fOut;
+    sink(Paint(kBold, Summary()) + "\n");
+    WriteDifferences(sink);
+    sink("\n" + WriteTextCoverage(fReport));
 }
 
 std::string TTextFormat::Summary() const
 {
-    const TComparisonReport::TCounts counts = fReport.Count();
+    const TDifferenceCounts& counts = fReport.differences->GetCounts();
     if (counts.GetTotal() == 0) {
         return Agreement();
     }
@@ -65,7 +64,7 @@ std::string TTextFormat::Agreement() const
     return "No differences in what was compared" + between + "; not everything was, see below.";
 }
 
-std::string TTextFormat::Kinds(const TComparisonReport::TCounts& counts) const
+std::string TTextFormat::Kinds(const TDifferenceCounts& counts) const
 {
     std::vector<std::string> kinds;
     if (counts.onlyInReference > 0) {
@@ -84,37 +83,38 @@ std::string TTextFormat::Kinds(const TComparisonReport::TCounts& counts) const
     return boost::algorithm::join(kinds, ", ");
 }
 
-void TTextFormat::WriteDifferences()
+void TTextFormat::WriteDifferences(const TTextSink& sink) const
 {
     // Differences come by class, then instance: a new name gets a new heading.
-    const TDifference* previous = nullptr;
-    for (const TDifference& difference : fReport.differences) {
-        if (previous == nullptr || previous->className != difference.className) {
-            fOut += "\n" + Paint(kBold, EscapeForDisplay(difference.className)) + "\n";
-            previous = nullptr;
+    std::string className;
+    std::string changed;  // the instance of the difference before, if that is a changed value
+    fReport.differences->ForEach([&](const TDifference& difference) {
+        if (className != difference.className) {
+            className = difference.className;
+            changed.clear();
+            sink("\n" + Paint(kBold, EscapeForDisplay(className)) + "\n");
         }
-        WriteDifference(difference, previous != nullptr && previous->kind == TDifference::kChanged &&
-                                        previous->instance == difference.instance);
-        previous = &difference;
-    }
+        const bool isChanged = difference.kind == TDifference::kChanged;
+        sink(Describe(difference, isChanged && changed == difference.instance));
+        changed = isChanged ? difference.instance : std::string();
+    });
 }
 
-void TTextFormat::WriteDifference(const TDifference& difference, bool sameInstance)
+// The values alone if the instance is that of the difference before.
+std::string TTextFormat::Describe(const TDifference& difference, bool sameInstance) const
 {
     const TDifferenceText text(fReport, difference);
+    if (sameInstance) {
+        return text.Values();
+    }
     switch (difference.kind) {
     case TDifference::kOnlyInReference:
-        fOut += Paint(kRed, "- " + text.Instance()) + "\n";
-        break;
+        return Paint(kRed, "- " + text.Instance()) + "\n" + text.Values();
     case TDifference::kOnlyInOthers:
-        fOut += Paint(kGreen, "+ " + text.Instance()) + "\n";
-        break;
-    case TDifference::kChanged:
-        if (!sameInstance) {
-            fOut += Paint(kYellow, "~ " + text.Instance()) + "\n";
-        }
+        return Paint(kGreen, "+ " + text.Instance()) + "\n" + text.Values();
+    default:
+        return Paint(kYellow, "~ " + text.Instance()) + "\n" + text.Values();
     }
-    fOut += text.Values();
 }
 
 std::string TTextFormat::Labels(const std::vector<std::size_t>& inventories) const

@@ -4,6 +4,7 @@
 #include <vector>
 
 #include "client/comparison/TComparisonReport.h"
+#include "client/report/TTextSink.h"
 
 namespace NORVZEL20 {
 
@@ -13,15 +14,16 @@ class TTextFormat {
     /// `report` must outlive this. `colored` adds escape sequences for a terminal.
     TTextFormat(const TComparisonReport& report, bool colored) : fReport(report), fColored(colored) {}
 
-    /// The whole text. Names and values in it are escaped as by EscapeForDisplay.
-    std::string Write();
+    /// Writes the whole text. Names and values in it are escaped as by EscapeForDisplay. Errors: those of TDifferenceList::ForEach;
+    /// what the sink throws.
+    void Write(const TTextSink& sink) const;
 
   private:
     std::string Summary() const;
     std::string Agreement() const;
-    std::string Kinds(const TComparisonReport::TCounts& counts) const;
-    void WriteDifferences();
-    void WriteDifference(const TDifference& difference, bool sameInstance);
+    std::string Kinds(const TDifferenceCounts& counts) const;
+    void WriteDifferences(const TTextSink& sink) const;
+    std::string Describe(const TDifference& difference, bool sameInstance) const;
     std::string Labels(const std::vector<std::size_t>& inventories) const;
     std::string Others() const;
     std::string Paint(const char* color, const std::string& text) const;
@@ -29,7 +31,6 @@ class TTextFormat {
 
     const TComparisonReport& fReport;
     const bool fColored;
-    std::string fOut;
 };
 
 }  // namespace NORVZEL20

@@ -1,0 +1,64 @@
+#include "client/report/TJsonDocument.h"
+
+#include <utility>
+
+#include "client/report/JsonValue.h"
+
+namespace NORVZEL20 {
+
+namespace {
+
+// In the object, and in a list that is a member of it.
+const char kMemberStart[] = "\n  ";
+const char kElementStart[] = "\n    ";
+
+// The text of a value within others, of which each line but the first begins like `start`. Texts in it have no line ends.
+std::string Within(const char* start, const nlohmann::ordered_json& value)
+{
+    const std::string text = WriteJson(value, true);
+    std::string indented;
+    std::size_t begin = 0;
+    for (std::size_t end = text.find('\n'); end + 1 < text.size(); end = text.find('\n', begin)) {
+        indented.append(text, begin, end - begin).append(start);
+        begin = end + 1;
+    }
+    return indented.append(text, begin, text.size() - 1 - begin);
+}
+
+}  // namespace
+
+TJsonDocument::TJsonDocument(TTextSink sink) : fSink(std::move(sink))
+{
+    fSink("{");
+}
+
+void TJsonDocument::Add(const std::string& name, const nlohmann::ordered_json& value)
+{
+    fSink((fIsEmpty ? "" : ",") + (kMemberStart + ("\"" + name + "\": ")) + Within(kMemberStart, value));
+    fIsEmpty = false;
+}
+
+void TJsonDocument::StartList(const std::string& name)
+{
+    fSink((fIsEmpty ? "" : ",") + (kMemberStart + ("\"" + name + "\": [")));
+    fIsEmpty = false;
+    fIsListEmpty = true;
+}
+
+void TJsonDocument::AddElement(const nlohmann::ordered_json& value)
+{
+    fSink((fIsListEmpty ? "" : ",") + (kElementStart + Within(kElementStart, value)));
+    fIsListEmpty = false;
+}
+
+void TJsonDocument::EndList()
+{
+    fSink(fIsListEmpty ? "]" : kMemberStart + std::string("]"));
+}
+
+void TJsonDocument::End()
+{
+    fSink("\n}\n");
+}
+
+}  // namespace NORVZEL20
