@@ -21,6 +21,7 @@ from rounds import Disagreement, Rounds
 
 ROOT = pathlib.Path(__file__).resolve().parents[2]
 FIGURES = ("report", "report-shuffled", "load", "compare", "compare-shuffled", "further", "many", "formats", "large")
+ON_DEMAND = ("instructions",)
 
 
 def parse():
@@ -28,7 +29,8 @@ def parse():
     parser.add_argument("--build", type=pathlib.Path, default=ROOT / "build/release/bin", help="folder of the programs to measure")
     parser.add_argument("--before", type=pathlib.Path, help="folder of an earlier build's cimdelta and bench_steps")
     parser.add_argument("--rounds", type=int, default=5, help="default: 5")
-    parser.add_argument("--only", nargs="+", choices=FIGURES, default=FIGURES, help="some of the figures")
+    parser.add_argument("--only", nargs="+", choices=FIGURES + ON_DEMAND, default=FIGURES,
+                        help="some of the figures; instructions are counted on demand only, and take valgrind")
     parser.add_argument("--instances", type=int, help="in an inventory; default: 100,000")
     parser.add_argument("--limit", type=int, default=120, help="seconds of CPU that one program may take; default: 120")
     parser.add_argument("--quick", action="store_true", help="one round over tiny inventories, to see that everything runs")
@@ -71,7 +73,7 @@ def run_of(options, sizes, figures, rounds):
                                      "numbers": {name: both for name, both in numbers.items() if both}}
         over = {name: reason for (key, name), reason in rounds.over.items() if key == figure.key}
         found[figure.key] = {"title": figure.title, "measures": measures, "over": over}
-    return {"date": datetime.date.today().isoformat(), "label": options.record or "", "commit": commit(), "rounds": options.rounds,
+    return {"date": datetime.date.today().isoformat(), "label": options.record or "", "commit": commit(), "rounds": rounds.complete,
             "sizes": dataclasses.asdict(sizes), "figures": found}
 
 
@@ -104,10 +106,14 @@ def measure(options, folder):
         build.check()
     files = inventories.Inventories(options.build / "generate_inventory", folder, sizes)
     makers = Figures(builds, programs.FlatPeer(options.build), databases_of(options.build), files).makers()
-    figures = [makers[key]() for key in FIGURES if key in options.only]
+    figures = [makers[key]() for key in FIGURES + ON_DEMAND if key in options.only]
     rounds = Rounds(figures, options.limit, lambda text: print(text, file=sys.stderr))
     rounds.check()
-    rounds.run(options.rounds)
+    try:
+        rounds.run(options.rounds)
+    except KeyboardInterrupt:
+        if rounds.complete == 0:
+            raise
     return run_of(options, sizes, figures, rounds)
 
 
@@ -120,6 +126,8 @@ def main():
     except (Disagreement, counting.NotCountable, measuring.ProgramFailure) as fault:
         print(f"bench: {fault}", file=sys.stderr)
         return 2
+    except KeyboardInterrupt:
+        return 130
     print("best and median; for a build the ratios of medians")
     show(run, recorded)
     if options.record:

@@ -31,6 +31,7 @@ class Figure:
     title: str
     contenders: typing.Sequence[Contender]
     measures: typing.Sequence[Measure]
+    once: bool = False             # repeating it gives the same numbers
 
 
 def _quotient(number, other):
@@ -69,7 +70,7 @@ class Figures:
         """From the key of each figure to the function that makes it, and its inventories."""
         return {"report": self._report, "report-shuffled": self._report_shuffled, "load": self._load, "compare": self._compare,
                 "compare-shuffled": self._compare_shuffled, "further": self._further, "many": self._many,
-                "formats": self._formats, "large": self._large}
+                "formats": self._formats, "large": self._large, "instructions": self._instructions}
 
     def _report(self):
         return self._report_of("report", "two files to report, key order", self.inventories.in_key_order())
@@ -135,6 +136,17 @@ class Figures:
         peer = Contender(self.flat.name, True, [self.flat.report(files, self.output) for files in both])
         builds = self._each(lambda build: [build.report(files, self.output) for files in both])
         return Figure("large", f"two files to report, {growth}", [peer, *builds], measures)
+
+    def _instructions(self):
+        """What a shared machine does not disturb."""
+        files = self.inventories.few()
+        peer = Contender(self.flat.name, True, [self.flat.load(files[:1]).counted()])
+        builds = self._each(lambda build: [build.load(files[:1]).counted(), build.load(files).counted(),
+                                           build.compare(files, self.inventories.rules).counted()])
+        measures = [Measure("load", "loading", "thousand an instance", lambda turn: turn[0].instructions / self.sizes.few / 1e3),
+                    Measure("compare", "comparing two", "thousand an instance",
+                            lambda turn: (turn[2].instructions - turn[1].instructions) / self.sizes.few / 1e3, True)]
+        return Figure("instructions", f"instructions, {self.sizes.few:,} instances", [peer, *builds], measures, once=True)
 
     def _each(self, commands):
         return [Contender(build.name, False, commands(build)) for build in self.builds]

@@ -12,11 +12,12 @@ class Sizes:
     classes: int = 200
     further: int = 7     # inventories beside the reference, for the growth with their number
     many: int = 1_000    # inventories with one instance of each class
+    few: int = 3_000     # instances, for counting instructions
     times: int = 10      # how much larger the largest inventories are
     changed: int = 273   # values that change, per mille, in the inventories with many differences: 300,000 of 1,100,000
 
 
-QUICK = Sizes(instances=300, classes=10, further=3, many=5, times=2)
+QUICK = Sizes(instances=300, classes=10, further=3, many=5, few=50, times=2)
 
 
 class Inventories:
@@ -35,6 +36,9 @@ class Inventories:
 
     def much_changed(self):
         return [self._file("changed", self.sizes.instances, state, "--changed", str(self.sizes.changed)) for state in range(2)]
+
+    def few(self):
+        return [self._file("few", self.sizes.few, state) for state in range(2)]
 
     def large(self):
         return [self._file("large", self.sizes.instances * self.sizes.times, state) for state in range(2)]

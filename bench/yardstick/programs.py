@@ -18,6 +18,10 @@ class Command:
     output: str = ""
     statuses: tuple = (0,)
 
+    def counted(self):
+        """The same, with its instructions counted."""
+        return dataclasses.replace(self, arguments=("valgrind", "--tool=callgrind", "--callgrind-out-file=/dev/null", *self.arguments))
+
     def differences(self, sample):
         """The number of differences that the last run found."""
         if self.format:

@@ -17,7 +17,8 @@ class Rounds:
         self.say = say
         self.over = {}        # (figure, contender) -> why it takes no part
         self.answers = {}     # question -> {number: who found it}
-        self.samples = {}     # (figure, contender, measure) -> numbers
+        self.samples = {}     # (figure, contender, measure) -> numbers, one for each complete round
+        self.complete = 0     # rounds
 
     def check(self):
         """Runs every contender once and throws Disagreement if two answer a question differently. These runs are not counted."""
@@ -34,26 +35,26 @@ class Rounds:
                 raise Disagreement(f"differences between {question}: {answers}")
 
     def run(self, count):
-        """Each round starts with another contender, because the first of a series often has an advantage."""
+        """Adds the samples of each round when it is complete, so an interrupted run has those of the rounds before."""
         for number in range(count):
-            for figure in self.figures:
-                first = number % len(figure.contenders)
-                for contender in [*figure.contenders[first:], *figure.contenders[:first]]:
-                    self.say(f"round {number + 1} of {count}, {figure.key}: {contender.name}")
-                    turn = self._turn(figure, contender)
-                    if turn is not None:
-                        self._note(figure, contender, turn)
+            for key, sample in self._round(number, f"round {number + 1} of {count}"):
+                self.samples.setdefault(key, []).append(sample)
+            self.complete += 1
+
+    def _round(self, number, name):
+        """Each round starts with another contender, because the first of a series often has an advantage."""
+        found = []
+        for figure in (figure for figure in self.figures if number == 0 or not figure.once):
+            first = number % len(figure.contenders)
+            for contender in [*figure.contenders[first:], *figure.contenders[:first]]:
+                self.say(f"{name}, {figure.key}: {contender.name}")
+                found.extend(_numbers(figure, contender, self._turn(figure, contender)))
+        return found
 
     def best_and_median(self, figure, contender, measure):
         """Two numbers, or None if there are no samples."""
         samples = self.samples.get((figure.key, contender.name, measure.key))
         return (min(samples), statistics.median(samples)) if samples else None
-
-    def _note(self, figure, contender, turn):
-        for measure in figure.measures:
-            number = None if measure.builds_only and contender.is_peer else measure.of(turn)
-            if number is not None:
-                self.samples.setdefault((figure.key, contender.name, measure.key), []).append(number)
 
     def _turn(self, figure, contender):
         """The samples of the contender's commands. None if one of them took too long, now or before."""
@@ -64,3 +65,11 @@ class Rounds:
         except measuring.OverLimit as reason:
             self.over[figure.key, contender.name] = str(reason)
             return None
+
+
+def _numbers(figure, contender, turn):
+    """Keys and numbers of what was measured in a turn."""
+    for measure in figure.measures:
+        number = None if turn is None or (measure.builds_only and contender.is_peer) else measure.of(turn)
+        if number is not None:
+            yield (figure.key, contender.name, measure.key), number

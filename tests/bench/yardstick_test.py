@@ -3,6 +3,7 @@
 Usage: yardstick_test.py ROOT PROGRAMS [unittest options]. PROGRAMS is the folder with cimdelta and the programs of bench/.
 """
 import json
+import os
 import pathlib
 import subprocess
 import sys
@@ -24,14 +25,26 @@ LIES = """#!/bin/sh
 "$(dirname "$0")/honest" "$@" | sed 's/"differences": \\([0-9]*\\)/"differences": \\11/'
 """
 
+# Runs the program, and says how many instructions it took: 100,000 for each inventory, and as many for a comparison.
+CALLGRIND = """#!/bin/sh
+shift 2
+"$@" || exit
+case "$*" in
+*--spec*) echo "==1== Collected : 300000" >&2 ;;
+*few-1*) echo "==1== Collected : 200000" >&2 ;;
+*) echo "==1== Collected : 100000" >&2 ;;
+esac
+"""
+
 
 class DriverTest(unittest.TestCase):
     def setUp(self):
         self.folder = pathlib.Path(self.enterContext(tempfile.TemporaryDirectory()))
 
-    def drive(self, *options, build=PROGRAMS):
+    def drive(self, *options, build=PROGRAMS, path=""):
         command = [sys.executable, DRIVER, "--quick", "--build", build, "--results", self.folder, *options]
-        return subprocess.run(command, capture_output=True, text=True, check=False)
+        environment = dict(os.environ, PATH=path + os.environ["PATH"])
+        return subprocess.run(command, capture_output=True, text=True, check=False, env=environment)
 
     def recorded(self, suffix):
         return [path.read_text(encoding="utf-8") for path in self.folder.glob(f"*.{suffix}")]
@@ -61,6 +74,15 @@ class DriverTest(unittest.TestCase):
                 self.assertIn(f"  {measure['title']} ({measure['unit']})\n", ended.stdout)
         self.assertEqual(1, run["rounds"])
         self.assertIn(f"| {run['date']}: a move |", self.recorded("md")[0])
+
+    def test_instructions_are_those_that_callgrind_counts(self):
+        valgrind = self.folder / "valgrind"
+        valgrind.write_text(CALLGRIND, encoding="utf-8")
+        valgrind.chmod(0o755)
+        ended = self.drive("--only", "instructions", path=f"{self.folder}:")
+        self.assertEqual(0, ended.returncode, ended.stderr)
+        self.assertIn("  loading (thousand an instance)\n    flat        2.00     2.00\n    now         2.00     2.00  1.00 x flat\n"
+                      "  comparing two (thousand an instance)\n    now         2.00     2.00\n", ended.stdout)
 
     def test_the_last_recorded_numbers_stand_beside_the_new_ones(self):
         self.assertNotIn("last ", self.drive("--only", "load", "--record", "a move").stdout)
@@ -146,6 +168,21 @@ class RoundsTest(unittest.TestCase):
         run.check()
         run.run(3)
         self.assertEqual(["a b", "a b", "b a", "a b"], [" ".join(pair) for pair in zip(*[iter(self.log.read_text().split())] * 2)])
+
+    def test_an_interrupted_run_has_the_numbers_of_its_complete_rounds(self):
+        run = self.rounds(self.saying("a", 1), self.saying("b", 1))
+        said = []
+
+        def interrupt_in_the_middle_of_the_second(text):
+            said.append(text)
+            if len(said) == 4:
+                raise KeyboardInterrupt
+
+        run.say = interrupt_in_the_middle_of_the_second
+        with self.assertRaises(KeyboardInterrupt):
+            run.run(3)
+        self.assertEqual(["round 2 of 3, f: b", "round 2 of 3, f: a"], said[2:])
+        self.assertEqual((1, {("f", "a", "m"): [1], ("f", "b", "m"): [1]}), (run.complete, run.samples))
 
     def test_different_answers_are_named(self):
         with self.assertRaisesRegex(rounds.Disagreement, r"differences between how many: a \(f\) 1, c \(f\) 2"):
