@@ -5,6 +5,7 @@ Usage: yardstick_test.py ROOT PROGRAMS [unittest options]. PROGRAMS is the folde
 import json
 import os
 import pathlib
+import re
 import subprocess
 import sys
 import tempfile
@@ -101,6 +102,68 @@ class DriverTest(unittest.TestCase):
         ended = self.drive("--before", str(self.folder))
         self.assertEqual(2, ended.returncode)
         self.assertIn("has no cimdelta", ended.stderr)
+
+
+class GeneratorTest(unittest.TestCase):
+    def generate(self, *arguments):
+        return subprocess.run([PROGRAMS / "generate_inventory", *arguments], capture_output=True, text=True, check=True).stdout
+
+    def instances(self, *arguments):
+        return re.findall(r"<INSTANCE .*?</INSTANCE>", self.generate(*arguments), re.DOTALL)
+
+    def names(self, *arguments):
+        return [re.search(r'"Name".*?<VALUE>(.*?)<', instance)[1] for instance in self.instances(*arguments)]
+
+    def test_equal_arguments_give_equal_bytes(self):
+        arguments = ("50", "3", "--classes", "7", "--shuffled", "9")
+        self.assertEqual(self.generate(*arguments), self.generate(*arguments))
+
+    def test_every_class_has_its_share_of_the_instances(self):
+        declared = re.findall('<CLASS NAME="(.*?)"', self.generate("30", "0", "--classes", "10"))
+        used = [re.search('CLASSNAME="(.*?)"', instance)[1] for instance in self.instances("30", "0", "--classes", "10")]
+        self.assertEqual([f"BENCH_Software{number:03}" for number in range(10)], declared)
+        self.assertEqual([name for name in declared for _ in range(3)], used)
+
+    def test_shuffled_inventories_have_the_same_instances_in_another_order(self):
+        ordered, shuffled = self.instances("500", "1"), self.instances("500", "1", "--shuffled", "2")
+        self.assertNotEqual(ordered, shuffled)
+        self.assertEqual(sorted(ordered), sorted(shuffled))
+        self.assertNotEqual(shuffled, self.instances("500", "1", "--shuffled", "3"))
+
+    def test_other_states_lack_instances_have_new_ones_and_stay_in_key_order(self):
+        reference, other = self.names("2000", "0"), self.names("2000", "1")
+        self.assertEqual(sorted(other), other)
+        self.assertEqual((9, 9), (len(set(reference) - set(other)), len(set(other) - set(reference))))
+
+    def test_nothing_changes_in_instances_of_both_states_if_no_value_may(self):
+        reference, other = self.instances("2000", "0"), self.instances("2000", "1", "--changed", "0")
+        self.assertEqual(9, len(set(reference) - set(other)))
+        self.assertLess(1000, len(set(reference) - set(self.instances("2000", "1", "--changed", "273"))))
+
+
+class PeersTest(unittest.TestCase):
+    CLASS = '<CLASS NAME="A"><PROPERTY NAME="K"><QUALIFIER NAME="Key"/></PROPERTY></CLASS>'
+    REFUSED = (
+        ("<CIM>", "no element found"),
+        ('<CIM><INSTANCE CLASSNAME="A"/></CIM>', "an instance of A comes before its class"),
+        (f'<CIM>{CLASS}<INSTANCE CLASSNAME="A"><PROPERTY NAME="X"/></INSTANCE></CIM>', "property X is not declared"),
+    )
+
+    def test_what_a_peer_cannot_read_is_refused_with_the_reason(self):
+        with tempfile.NamedTemporaryFile("w", encoding="utf-8") as file:
+            for document, reason in self.REFUSED:
+                with self.subTest(document=document):
+                    file.seek(0)
+                    file.truncate()
+                    file.write(document)
+                    file.flush()
+                    ended = subprocess.run([PROGRAMS / "peer_flat", file.name], capture_output=True, text=True, check=False)
+                    self.assertEqual((2, f"peer_flat: {file.name}: {reason}\n"), (ended.returncode, ended.stderr))
+
+    def test_a_file_that_is_missing_is_refused(self):
+        ended = subprocess.run([PROGRAMS / "bench_steps", "/no/such/file"], capture_output=True, text=True, check=False)
+        self.assertEqual(2, ended.returncode)
+        self.assertIn("/no/such/file", ended.stderr)
 
 
 class CountingTest(unittest.TestCase):
