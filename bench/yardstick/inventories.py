@@ -3,6 +3,8 @@ import dataclasses
 import pathlib
 import subprocess
 
+import measuring
+
 RULES = '<DifftoolSpec><class name="&lt;root&gt;" default="include"/></DifftoolSpec>\n'
 
 
@@ -49,7 +51,10 @@ class Inventories:
     def _file(self, name, instances, state, *options):
         path = self.folder / f"{name}-{state}.xml"
         if not path.exists():
-            with open(path, "wb") as file:
-                command = [self.generator, str(instances), str(state), "--classes", str(self.sizes.classes), *options]
-                subprocess.run(command, stdout=file, check=True)
+            command = [self.generator, str(instances), str(state), "--classes", str(self.sizes.classes), *options]
+            try:
+                with open(path, "wb") as file:
+                    subprocess.run(command, stdout=file, check=True)
+            except (OSError, subprocess.CalledProcessError) as fault:
+                raise measuring.ProgramFailure(f"{path} could not be made: {fault}") from fault
         return str(path)

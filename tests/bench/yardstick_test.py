@@ -103,6 +103,13 @@ class DriverTest(unittest.TestCase):
         self.assertEqual(2, ended.returncode)
         self.assertIn("has no cimdelta", ended.stderr)
 
+    def test_an_inventory_that_cannot_be_made_is_named(self):
+        folder = self.programs_with_a_liar()
+        (folder / "generate_inventory").unlink()
+        ended = self.drive("--only", "load", build=folder)
+        self.assertEqual(2, ended.returncode)
+        self.assertRegex(ended.stderr, "key-0.xml could not be made: .*No such file")
+
 
 class GeneratorTest(unittest.TestCase):
     def generate(self, *arguments):
