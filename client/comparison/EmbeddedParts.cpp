@@ -11,10 +11,11 @@
 #include "client/comparison/EmbeddedParts.h"
 
 #include <algorithm>
-#include <functional>
 #include <set>
 #include <utility>
 
+#include "client/comparison/TValueGroups.h"
+#include "client/inventory/HashValue.h"
 #include "embedded/value/TEmbeddedObject.h"
 #include "embedded/value/TNameText.h"
 
@@ -84,6 +85,11 @@ void AddToGroup(TValueDifference::TGroup& group, const TValueDifference::TGroup&
     }
 }
 
+bool AreEqual(const TCIMValue& one, const TCIMValue& other)
+{
+    return one == other;
+}
+
 // The property as a difference of its own; it has no others if the objects agree in it.
 TValueDifference PartOf(const TValueDifference& whole, const std::string& name, const std::vector<TObject>& objects,
                         bool hasReference)
@@ -93,13 +99,14 @@ TValueDifference PartOf(const TValueDifference& whole, const std::string& name, 
     if (hasReference) {
         part.reference = ValueIn(*objects.front(), name, objects);
     }
+    TValueGroups groups(part, &AreEqual, &HashValue);
     for (std::size_t i = 0; i < whole.others.size(); ++i) {
         const TCIMValue value = ValueIn(*objects[i + (hasReference ? 1 : 0)], name, objects);
         if (!hasReference || part.reference != value) {
-            AddToGroup(part.GetGroup(value, std::equal_to<TCIMValue>()), whole.others[i]);
+            AddToGroup(groups.Get(value), whole.others[i]);
         }
     }
-    if (!hasReference && !part.DoOthersDiffer(std::equal_to<TCIMValue>())) {
+    if (!hasReference && !groups.Differ()) {
         part.others.clear();
     }
     return part;

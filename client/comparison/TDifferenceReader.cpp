@@ -184,13 +184,13 @@ void TDifferenceReader::AddChange(TDifference& difference, const std::string& pr
     TValueDifference& change = difference.values.front();
     change.property = property;
     change.reference = ValueBefore(reference, change.property);
-    const TValueDifference::TEqual areEqual = MakeEqual(change.property);
+    TValueGroups groups = MakeGroups(change);
     for (const std::size_t inventory : difference.inventories) {
         const TInstanceIndex::TInstances& instances = Index(inventory).Find(difference.instance);
         for (const boost::shared_ptr<ICIMInstance>& instance : instances) {
             const TCIMValue value = ValueBefore(*instance, change.property);
             if (instances.size() == 1 || fRules.Differ(fClassName, change.reference, value)) {
-                change.GetGroup(value, areEqual).Add(inventory, 1);
+                groups.Get(value).Add(inventory, 1);
             }
         }
     }
@@ -209,25 +209,26 @@ void TDifferenceReader::AddDisagreements(TDifference& difference)
         TValueDifference values;
         values.property = fProperties[i];
         const TCIMValue::TCIMType declared = fClass->FindPropertyDecl(values.property)->GetType();
-        const TValueDifference::TEqual areEqual = MakeEqual(values.property);
+        TValueGroups groups = MakeGroups(values);
         for (const auto& [inventory, instance] : instances) {
-            values.GetGroup(ValueIfDeclared(*instance, values.property, declared), areEqual).Add(inventory, 1);
+            groups.Get(ValueIfDeclared(*instance, values.property, declared)).Add(inventory, 1);
         }
-        if (values.DoOthersDiffer(areEqual)) {
+        if (groups.Differ()) {
             AddEmbeddedParts(values, false);
             difference.values.push_back(std::move(values));
         }
     }
 }
 
-// The property must outlive the result.
-TValueDifference::TEqual TDifferenceReader::MakeEqual(const std::string& property) const
+// The difference must outlive the result.
+TValueGroups TDifferenceReader::MakeGroups(TValueDifference& difference) const
 {
-    return [this, &property](const TCIMValue& one, const TCIMValue& other) {
+    const auto areEqual = [this, &property = difference.property](const TCIMValue& one, const TCIMValue& other) {
         return one.GetType().IsArray() && !one.IsNull()
                    ? !fRules.Differ(fClassName, InFormOf(*fClass->FindPropertyDecl(property), one), other)
                    : !fRules.Differ(fClassName, one, other);
     };
+    return TValueGroups(difference, areEqual, [this](const TCIMValue& value) { return fRules.HashOf(fClassName, value); });
 }
 
 // The reference lacks the instance of an added key. After a run with two inventories it has a copy, which does not count.

@@ -7,6 +7,7 @@
 #include "client/comparison/TDeltaRecord.h"
 #include "client/comparison/TDifference.h"
 #include "client/comparison/TInstanceIndex.h"
+#include "client/comparison/TValueGroups.h"
 #include "client/inventory/TInventory.h"
 #include "client/rules/TRules.h"
 
@@ -39,7 +40,7 @@ class TDifferenceReader {
     void AddKeys(TDifference& difference, const ICIMInstance& instance);
     void AddChange(TDifference& difference, const std::string& property, const ICIMInstance& reference);
     void AddDisagreements(TDifference& difference);
-    TValueDifference::TEqual MakeEqual(const std::string& property) const;
+    TValueGroups MakeGroups(TValueDifference& difference) const;
     void CountSharing(TDifference& difference);
 
     const std::vector<TInventory>& fInventories;

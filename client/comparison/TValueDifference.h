@@ -29,15 +29,9 @@ struct TValueDifference {
     /// Whether two values are equal.
     using TEqual = boost::function<bool(const TCIMValue&, const TCIMValue&)>;
 
-    /// The group of `value`, added to `others` if there is none yet. A null is equal to a null of another type, but a group has one
-    /// type, so that it can be shown.
-    TGroup& GetGroup(const TCIMValue& value, const TEqual& areEqual);
-    /// Whether not all values of `others` are equal.
-    bool DoOthersDiffer(const TEqual& areEqual) const;
-
     std::string property;
     TCIMValue reference;         ///< the reference's value before the run; meaningless if the reference lacks the instance
-    std::vector<TGroup> others;  ///< the values that are not the reference's, equal ones together
+    std::vector<TGroup> others;  ///< the values that are not the reference's, equal ones together; see TValueGroups
     /// Of embedded instances: the same difference property by property, if that says all; see EmbeddedParts.h. The property is then
     /// a path such as `Settings.Speed`.
     std::vector<TValueDifference> parts;

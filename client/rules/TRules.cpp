@@ -4,8 +4,11 @@
 #include "client/rules/TRules.h"
 
 #include <algorithm>
+#include <functional>
 
+#include "client/inventory/HashValue.h"
 #include "client/rules/TRulesParser.h"
+#include "host/TCIMReference.h"
 #include "host/TZELException.h"
 
 namespace NORVZEL20 {
@@ -35,6 +38,15 @@ bool TRules::Differ(const std::string& className, const TCIMValue& reference, co
     // It refuses no values of one type.
     const bool isRefused = reference.GetType() != other.GetType() && Refuse(className, reference, other);
     return isRefused || fEngine.IsDifferent(Find(className), reference, other);
+}
+
+std::size_t TRules::HashOf(const std::string& className, const TCIMValue& value)
+{
+    if (value.IsNull() || value.GetType() != TCIMValue::TCIMType::kReference) {
+        return HashValue(value);
+    }
+    const TCIMReference path = value;
+    return std::hash<std::string>()(fEngine.buildPath(Find(className), path));
 }
 
 bool TRules::Refuse(const std::string& className, const TCIMValue& reference, const TCIMValue& other)

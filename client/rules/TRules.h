@@ -32,6 +32,9 @@ class TRules {
     /// the reference's: if it is a bag, the order of the elements does not count. True for values that the engine refuses.
     bool Differ(const std::string& className, const TCIMValue& reference, const TCIMValue& other);
 
+    /// The same number for values of one type that do not differ.
+    std::size_t HashOf(const std::string& className, const TCIMValue& value);
+
     /// Whether the engine refuses to compare two such values: a reference with a value of another type.
     bool Refuse(const std::string& className, const TCIMValue& reference, const TCIMValue& other);
 

@@ -200,5 +200,20 @@ TEST_F(SharedKeyTest, AClassWithoutKeysHasOneInstance)
     EXPECT_EQ("Clock\n- (the only instance; the class has no keys)\n", Differences({clock("UTC"), clock("")}));
 }
 
+TEST_F(SharedKeyTest, ManyReferencesAreGroupedWithoutTheExcludedKeys)
+{
+    std::string twins;
+    std::string groups;
+    for (int i = 0; i < 24; ++i) {
+        twins += Twin(std::to_string(i), "sd" + std::to_string(i % 12), std::to_string(i));
+    }
+    for (int i = 0; i < 12; ++i) {
+        groups += (i == 0 ? "" : " / ") + std::string("Disk.Boot=\"") + std::to_string(i) + "\",Id=\"sd" + std::to_string(i) +
+                  "\" (2 of 24 instances of b with this key)";
+    }
+    EXPECT_EQ("Disk\n~ Id=\"sda\"\n    Twin: Disk.Boot=\"1\",Id=\"sdx\" -> " + groups + "\n",
+              Differences({Declared() + Twin("1", "sdx", "1"), Declared() + twins}));
+}
+
 }  // namespace
 }  // namespace NORVZEL20
