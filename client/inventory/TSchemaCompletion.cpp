@@ -8,10 +8,16 @@
 //
 // What an early source declares in a later one is there when that one is the source; so one pass over all makes the union.
 //
+// Most classes of a source bring nothing new. Once a class has been taken to all inventories, its names are noted (TAgreedNames),
+// and a later source with the same names, or fewer, need not be held against the others: inventories lose no declaration meanwhile.
+// Only a spelling can change, if the classes above differ; the class is then forgotten and taken to all inventories once more. So N
+// inventories with the same C classes cost N times C steps.
+//
 // One name is decided beforehand: the plug-in knows the time of collection, which it leaves out, in one spelling only. Stored
 // references name classes and keys. Those of changed inventories are rewritten at the end.
 #include "client/inventory/TSchemaCompletion.h"
 
+#include <algorithm>
 #include <set>
 
 #include "client/process/TClientError.h"
@@ -45,20 +51,53 @@ std::string DescribeConflict(const TInMemClass& cls, const TInMemPropertyDecl& p
 std::vector<TSchemaNote> TSchemaCompletion::Run()
 {
     fNotes.clear();
+    fAgreed = TAgreedNames();
+    fComparisons = 0;
     SpellCollectionTimes();
     for (std::size_t source = 0; source < fInventories.size(); ++source) {
         // A copy of the list: if one namespace is passed twice, declaring in the target changes the source's list as well.
         const std::vector<boost::shared_ptr<TInMemClass>> classes = fInventories[source].ns->GetClasses();
         for (const boost::shared_ptr<TInMemClass>& cls : classes) {
-            for (std::size_t target = 0; target < fInventories.size(); ++target) {
-                if (target != source) {
-                    SpreadWithinLimits(source, *cls, target);
-                }
+            if (!fAgreed.Covers(*cls)) {
+                SpreadToAll(source, *cls);
             }
         }
     }
     AdaptReferences();
     return fNotes;
+}
+
+void TSchemaCompletion::SpreadToAll(std::size_t source, const TInMemClass& cls)
+{
+    bool agree = true;
+    for (std::size_t target = 0; target < fInventories.size(); ++target) {
+        if (target != source) {
+            ++fComparisons;
+            SpreadWithinLimits(source, cls, target);
+            agree = agree && Agrees(source, cls, target);
+        }
+    }
+    if (agree) {
+        fAgreed.Add(cls);
+    } else {
+        fAgreed.Forget(cls);
+    }
+}
+
+// Whether the target has all names of the class, and will not be spelled anew by a source that spells them likewise. A class that
+// was just declared may inherit another spelling from the classes above it there.
+bool TSchemaCompletion::Agrees(std::size_t source, const TInMemClass& cls, std::size_t target) const
+{
+    const boost::shared_ptr<TInMemClass> there = fInventories[target].ns->FindClass(cls.GetName());
+    const bool isSpellingFinal = target < source;
+    const std::vector<std::uint32_t>& slots = cls.GetLayout().GetOrder();
+    return (isSpellingFinal || there->GetName() == cls.GetName()) &&
+           std::all_of(slots.begin(), slots.end(), [&](std::uint32_t slot) {
+               const std::string& name = cls.GetLayout().GetDecl(slot).GetName();
+               const std::uint32_t counterpart = there->GetLayout().FindSlot(name);
+               return counterpart != TInMemLayout::kNoSlot &&
+                      (isSpellingFinal || there->GetLayout().GetDecl(counterpart).GetName() == name);
+           });
 }
 
 void TSchemaCompletion::SpellCollectionTimes()
@@ -146,7 +185,16 @@ void TSchemaCompletion::Respell(std::size_t source, const TInMemClass& cls, std:
         const std::string before = counterpart ? counterpart->GetName() : name;
         if (before != name && copier.RespellProperty(*there, name)) {
             Note(TSchemaNote::kPropertyRespelled, target, source, cls.GetName(), name, before);
+            ForgetRespelled(*there, name);
         }
+    }
+}
+
+// The classes below inherit the new spelling, also those that had the spelling of this source or an earlier one.
+void TSchemaCompletion::ForgetRespelled(const TInMemClass& cls, const std::string& property)
+{
+    for (const boost::shared_ptr<TInMemClass>& below : cls.GetClassesBelow()) {
+        fAgreed.Respelled(*below, below->FindPropertyDecl(property)->GetName());
     }
 }
 
