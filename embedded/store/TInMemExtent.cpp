@@ -13,6 +13,7 @@
 
 #include "embedded/store/TInMemExtent.h"
 
+#include <algorithm>
 #include <limits>
 #include <new>
 
@@ -252,9 +253,20 @@ void TInMemExtent::RollBack(const TMark& mark) noexcept
 
 void TInMemExtent::Refresh() const
 {
-    if (fIsStale || fKeyVersion != fLayout.GetKeyVersion()) {
+    if (fKeyVersion != fLayout.GetKeyVersion() || (fTextVersion != fCurrentTextVersion && HasKeysWithReferences())) {
         Reindex();
     }
+    fTextVersion = fCurrentTextVersion;
+}
+
+/// Embedded objects hold references too, and are strings.
+bool TInMemExtent::HasKeysWithReferences() const noexcept
+{
+    const std::vector<std::uint32_t>& keys = fLayout.GetKeys();
+    return std::any_of(keys.begin(), keys.end(), [this](std::uint32_t slot) {
+        const TCIMValue::TCIMType type = fLayout.GetDecl(slot).GetType().GetElementType();
+        return type == TCIMValue::TCIMType::kReference || type == TCIMValue::TCIMType::kString;
+    });
 }
 
 void TInMemExtent::Reindex() const
@@ -276,7 +288,6 @@ void TInMemExtent::Reindex() const
     }
     fIndex.Swap(index);
     fKeyVersion = fLayout.GetKeyVersion();
-    fIsStale = false;
 }
 
 }  // namespace NORVZEL20

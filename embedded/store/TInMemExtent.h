@@ -23,8 +23,11 @@ class TInMemExtent {
         std::uint64_t nextGenerated;
     };
 
-    /// `layout` is that of the class, and must outlive this.
-    explicit TInMemExtent(const TInMemLayout& layout) noexcept : fLayout(layout), fKeyVersion(layout.GetKeyVersion()) {}
+    /// `layout` is that of the class. `textVersion` changes whenever the texts of references in keys may have changed; the keys are
+    /// indexed anew when the index is next needed, so any number of changes costs one pass. Both must outlive this.
+    TInMemExtent(const TInMemLayout& layout, const std::uint64_t& textVersion) noexcept
+        : fLayout(layout), fCurrentTextVersion(textVersion), fKeyVersion(layout.GetKeyVersion()), fTextVersion(textVersion)
+    {}
     TInMemExtent(const TInMemExtent&) = delete;
     TInMemExtent& operator=(const TInMemExtent&) = delete;
     ~TInMemExtent();
@@ -50,12 +53,9 @@ class TInMemExtent {
     /// Takes out what was added since the mark. Nothing may have been removed since.
     void RollBack(const TMark& mark) noexcept;
 
-    /// Call this after the texts of references in keys have changed. The keys are indexed anew when the index is next needed, so
-    /// any number of changes costs one pass.
-    void KeyTextsChanged() noexcept { fIsStale = true; }
-
   private:
     void Refresh() const;
+    bool HasKeysWithReferences() const noexcept;
     void Reindex() const;
     std::uint32_t HashOf(const TInMemInstance& instance) const;
     bool HasSameKeys(const TInMemInstance& a, const TInMemInstance& b) const;
@@ -67,10 +67,11 @@ class TInMemExtent {
     void CompactIfPossible() noexcept;
 
     const TInMemLayout& fLayout;
+    const std::uint64_t& fCurrentTextVersion;
     std::vector<boost::shared_ptr<TInMemInstance>> fInstances;  // null in the place of one that was removed
     mutable THashIndex fIndex;                                  // by TInMemInstance::GetKeyHash, also while it is stale
     mutable std::uint32_t fKeyVersion;                          // of the layout, when the index was made
-    mutable bool fIsStale = false;                              // for another reason than that
+    mutable std::uint64_t fTextVersion;                         // likewise, of the texts of references
     std::size_t fCount = 0;
     std::uint64_t fNextGenerated = 1;
     mutable unsigned int fEnumerations = 0;  // in progress; positions must not change meanwhile

@@ -147,7 +147,7 @@ void TInMemNamespace::CheckDeclarable(const TInMemClass& cls) const
 void TInMemNamespace::Declare(const boost::shared_ptr<TInMemClass>& cls)
 {
     CheckDeclarable(*cls);
-    TEntry entry{cls, std::make_unique<TInMemExtent>(cls->GetLayout())};
+    TEntry entry{cls, std::make_unique<TInMemExtent>(cls->GetLayout(), fReferenceTextVersion)};
     // If a later step fails, Withdraw undoes those that were done and ignores the others.
     cls->Enter(GetParent(*cls), *entry.extent);
     try {

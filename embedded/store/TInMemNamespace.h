@@ -98,8 +98,9 @@ class CIMDELTA_EXPORT TInMemNamespace final : public ICIMNamespace,
     void SetObjectReader(TReadObject read) noexcept { fReadObject = read; }
     TCIMValue ReadObject(const TCIMValue& text, std::size_t depth) const;
     /// Call this after the text of a reference may have changed, with the spelling of a class or of a key: instances with
-    /// references in their keys are then found by the new text.
-    void ReferenceTextsChanged();
+    /// references in their keys are then found by the new text. Cost: constant; the index of a class is made anew when it is next
+    /// needed.
+    void ReferenceTextsChanged() noexcept { ++fReferenceTextVersion; }
 
     /// TInMemClass::AddToNamespace and Validate. Errors: see there; nothing has changed then.
     void Declare(const boost::shared_ptr<TInMemClass>& cls);
@@ -124,6 +125,7 @@ class CIMDELTA_EXPORT TInMemNamespace final : public ICIMNamespace,
     TOwnPlace fOwnPlace;
     TReadObject fReadObject = nullptr;
     boost::shared_ptr<TInMemClass> fRoot;  // "<root>": its subclasses are the top-level classes
+    std::uint64_t fReferenceTextVersion = 0;
     std::vector<boost::shared_ptr<TInMemClass>> fClasses;
     TNameHashMap<TEntry> fClassesByName;
     std::vector<boost::shared_ptr<TInMemQualifierDecl>> fQualifierDecls;

@@ -127,19 +127,4 @@ void TInMemNamespace::ClearInstances()
     }
 }
 
-/// Only references have such texts, and embedded objects, which are strings; other classes keep their index.
-void TInMemNamespace::ReferenceTextsChanged()
-{
-    for (const auto& cls : fClasses) {
-        const TInMemLayout& layout = cls->GetLayout();
-        for (const std::uint32_t slot : layout.GetKeys()) {
-            const TCIMValue::TCIMType type = layout.GetDecl(slot).GetType().GetElementType();
-            if (type == TCIMValue::TCIMType::kReference || type == TCIMValue::TCIMType::kString) {
-                cls->GetExtent().KeyTextsChanged();
-                break;
-            }
-        }
-    }
-}
-
 }  // namespace NORVZEL20
