@@ -9,6 +9,7 @@
 #include "client/comparison/TComparison.h"
 
 #include <algorithm>
+#include <set>
 
 #include "client/comparison/ReadDeltaRecords.h"
 #include "client/comparison/ReferenceStandIns.h"
@@ -19,7 +20,7 @@
 #include "client/comparison/TDifferenceList.h"
 #include "client/files/TTemporaryFile.h"
 #include "client/inventory/CompleteInventories.h"
-#include "client/inventory/CountInstances.h"
+#include "client/inventory/TInstanceCounts.h"
 #include "client/inventory/TSuggestedCommand.h"
 #include "client/inventory/UncomparedSystems.h"
 #include "client/process/LackOfMemory.h"
@@ -115,10 +116,11 @@ TComparisonReport TComparison::RunWith(const std::shared_ptr<TRules>& rules, con
 // In the order of the rules, each once.
 std::vector<std::string> TComparison::FindIdleRules(const TRulesDocument& document) const
 {
+    const TInstanceCounts counts(fInventories, fNotes);
     std::vector<std::string> names;
+    std::set<std::string> seen;
     for (const TRulesDocument::TElement& element : document.elements) {
-        if (std::find(names.begin(), names.end(), element.className) == names.end() &&
-            CountInstancesOfTree(fInventories, fNotes, element.className) == 0) {
+        if (seen.insert(element.className).second && counts.OfTree(element.className) == 0) {
             names.push_back(element.className);
         }
     }

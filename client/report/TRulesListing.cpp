@@ -17,7 +17,6 @@
 
 #include "client/files/TInputFile.h"
 #include "client/inventory/CollectObjects.h"
-#include "client/inventory/CountInstances.h"
 #include "client/inventory/RequireClass.h"
 #include "client/inventory/TSuggestedCommand.h"
 #include "client/inventory/UncomparedSystems.h"
@@ -40,10 +39,13 @@ const char* Verb(TCIMDiffEngine::propType treatment)
     return treatment == TCIMDiffEngine::INCLUDE ? "include" : "exclude";
 }
 
-// The plug-in lists an included property in the spelling of the rules, hence without regard to letter case.
-bool Contains(const std::vector<std::string>& names, const std::string& name)
+std::set<std::string, TNameText::TLess> NamedClasses(const TRulesDocument& document)
 {
-    return std::any_of(names.begin(), names.end(), [&name](const std::string& other) { return TNameText::Equal(other, name); });
+    std::set<std::string, TNameText::TLess> names;
+    for (const TRulesDocument::TElement& element : document.elements) {
+        names.insert(element.className);
+    }
+    return names;
 }
 
 std::vector<std::string> PropertyNames(const TInMemClass& cls)
@@ -72,7 +74,7 @@ TRulesListing::TRulesListing(const TRulesText& rules, const std::vector<TInvento
                              const std::vector<TSchemaNote>& notes, bool strictSchema)
     : fText(rules), fInventories(inventories), fNotes(notes), fStrictSchema(strictSchema), fSchema(FindSchema(rules, inventories)),
       fRules(fSchema, rules), fDocument(fRules.GetDocument()), fTrace(fDocument, fSchema),
-      fWarnings(fDocument, fTrace, fSchema, !inventories.empty())
+      fWarnings(fDocument, fTrace, fSchema, !inventories.empty()), fNamed(NamedClasses(fDocument))
 {}
 
 std::string TRulesListing::WriteCheck()
@@ -86,8 +88,9 @@ std::string TRulesListing::WriteCheck()
         AddLine("Whether the classes and properties are declared was not checked, because there is no --schema.");
         return fOut;
     }
-    WriteEffective();
-    WriteUnmatched();
+    const TInstanceCounts counts(fInventories, fNotes);
+    WriteEffective(counts);
+    WriteUnmatched(counts);
     WriteWarnings();
     return fOut;
 }
@@ -106,12 +109,12 @@ void TRulesListing::WriteElements()
     }
 }
 
-void TRulesListing::WriteEffective()
+void TRulesListing::WriteEffective(const TInstanceCounts& counts)
 {
     AddLine("");
     AddLine("Effective rules (classes with instances in " + PathsOfInventories() + ", or with an element):");
     for (const boost::shared_ptr<TInMemClass>& cls : fSchema->GetClasses()) {
-        if (CountOwnInstances(fInventories, fNotes, cls->GetName()) > 0 || HasElement(cls->GetName())) {
+        if (counts.OfClass(cls->GetName()) > 0 || HasElement(cls->GetName())) {
             WriteEffective(cls);
         }
     }
@@ -119,7 +122,7 @@ void TRulesListing::WriteEffective()
 
 void TRulesListing::WriteEffective(const boost::shared_ptr<TInMemClass>& cls)
 {
-    const std::vector<std::string> compared = fRules.PropertiesOf(cls);
+    const TNames compared = ComparedIn(cls);
     if (IsNeverCompared(*cls)) {
         AddLine("  " + cls->GetName() + ": not compared, " + SinceMade());
         return;
@@ -131,7 +134,7 @@ void TRulesListing::WriteEffective(const boost::shared_ptr<TInMemClass>& cls)
     std::vector<std::string> leftOut;
     const std::vector<std::string> all = PropertyNames(*cls);
     std::copy_if(all.begin(), all.end(), std::back_inserter(leftOut),
-                 [&compared](const std::string& name) { return !Contains(compared, name); });
+                 [&compared](const std::string& name) { return compared.count(name) == 0; });
     const std::vector<std::string> keys = KeysLeftOut(*cls);
     AddLine("  " + cls->GetName() + ": " + std::to_string(all.size() - leftOut.size()) + " of " +
             Counted(all.size(), "property", "properties") + " compared" +
@@ -143,13 +146,13 @@ void TRulesListing::WriteEffective(const boost::shared_ptr<TInMemClass>& cls)
             (IsPartlyMade(*cls) ? "; " + NotComparedWhereMade() : ""));
 }
 
-void TRulesListing::WriteUnmatched()
+void TRulesListing::WriteUnmatched(const TInstanceCounts& counts)
 {
     std::string unmatched;
     for (std::size_t index = 0; index < fDocument.elements.size(); ++index) {
         const TRulesDocument::TElement& element = fDocument.elements[index];
         // The rules of an element also reach the classes below its class. One without effect gets a warning instead.
-        if (!fTrace.GetArrival(index).complete && CountInstancesOfTree(fInventories, fNotes, element.className) == 0) {
+        if (!fTrace.GetArrival(index).complete && counts.OfTree(element.className) == 0) {
             unmatched += "  " +
                          EscapeForDisplay(fText.name + ":" + std::to_string(element.line) + ": class " + element.className +
                                           " has no instances, nor has any class below it") +
@@ -180,7 +183,7 @@ std::string TRulesListing::WriteExplanation(const std::string& className)
         return WriteRootExplanation();
     }
     const boost::shared_ptr<TInMemClass> cls = RequireDeclared(className);
-    const std::vector<std::string> compared = fRules.PropertiesOf(cls);
+    const TNames compared = ComparedIn(cls);
     if (IsNeverCompared(*cls)) {
         AddLine(cls->GetName() + ": not compared, " + SinceMade());
         AddVerdicts(*cls, compared);
@@ -215,9 +218,9 @@ std::string TRulesListing::WriteExplanation(const std::string& className, const 
             (IsReferenceAlone() ? "" : " in any inventory") +
             TSuggestedCommand("explain").Add(cls->GetName()).AddSchemas(fInventories, fStrictSchema).Advise("lists those it has"));
     }
-    const std::vector<std::string> compared = fRules.PropertiesOf(cls);
-    AddLine(cls->GetName() + "." + Verdict(*cls, decl->GetName(), compared));
-    if (Contains(compared, decl->GetName()) && IsPartlyMade(*cls)) {
+    const TNames compared = ComparedIn(cls);
+    AddLine(cls->GetName() + "." + Verdict(*cls, decl->GetName(), compared, ReducedIn(*cls)));
+    if (compared.count(decl->GetName()) != 0 && IsPartlyMade(*cls)) {
         AddLine("  " + NotComparedWhereMade());
     }
     return fOut;
@@ -256,11 +259,32 @@ boost::shared_ptr<TInMemClass> TRulesListing::RequireDeclared(const std::string&
                        TSuggestedCommand("show").AddFile(fInventories.front().path).Advise("lists those of the first one"));
 }
 
-void TRulesListing::AddVerdicts(const TInMemClass& cls, const std::vector<std::string>& compared)
+// The plug-in lists an included property in the spelling of the rules, hence without regard to letter case.
+TRulesListing::TNames TRulesListing::ComparedIn(const boost::shared_ptr<TInMemClass>& cls)
 {
+    const std::vector<std::string> properties = fRules.PropertiesOf(cls);
+    return TNames(properties.begin(), properties.end());
+}
+
+void TRulesListing::AddVerdicts(const TInMemClass& cls, const TNames& compared)
+{
+    const TReduced reduced = ReducedIn(cls);
     for (const std::string& property : PropertyNames(cls)) {
-        AddLine("  " + Verdict(cls, property, compared));
+        AddLine("  " + Verdict(cls, property, compared, reduced));
     }
+}
+
+TRulesListing::TReduced TRulesListing::ReducedIn(const TInMemClass& cls) const
+{
+    TReduced reduced;
+    const std::vector<std::string> names = fTrace.FindReducedReferences(cls);
+    if (!names.empty()) {
+        reduced.properties.insert(names.begin(), names.end());
+        reduced.description = "; references " + DescribeReducedReferences(fTrace.FindKeysOfReferences(cls.GetName())) +
+                              " (excludekeys, " + fText.name + ":" + std::to_string(fTrace.Find(cls.GetName()).excludedKeysLine) +
+                              ")";
+    }
+    return reduced;
 }
 
 // Rules cannot include what cimdelta has made.
@@ -289,9 +313,7 @@ std::string TRulesListing::NotComparedWhereMade() const
 
 bool TRulesListing::HasElement(const std::string& className) const
 {
-    return std::any_of(fDocument.elements.begin(), fDocument.elements.end(), [&className](const TRulesDocument::TElement& element) {
-        return TNameText::Equal(element.className, className);
-    });
+    return fNamed.count(className) != 0;
 }
 
 // The excluded keys that are keys of the class. Rules may also name others, which changes nothing.
@@ -323,18 +345,16 @@ std::vector<std::string> TRulesListing::PathsOf(const std::vector<std::size_t>& 
     return paths;
 }
 
-std::string TRulesListing::Verdict(const TInMemClass& cls, const std::string& property, const std::vector<std::string>& compared)
+std::string TRulesListing::Verdict(const TInMemClass& cls, const std::string& property, const TNames& compared,
+                                   const TReduced& reduced)
 {
     if (IsNeverCompared(cls)) {
         return property + ": not compared, " + SinceMade();
     }
-    const bool isCompared = Contains(compared, property);
-    const std::vector<std::string> reduced = fTrace.FindReducedReferences(cls);
-    const bool isReduced = isCompared && std::find(reduced.begin(), reduced.end(), property) != reduced.end();
+    const bool isCompared = compared.count(property) != 0;
+    const bool isReduced = isCompared && reduced.properties.count(property) != 0;
     return property + ": " + (isCompared ? "compared" : "not compared") + ", " + Reason(cls, property, isCompared) +
-           (isReduced ? "; references " + DescribeReducedReferences(fTrace.FindKeysOfReferences(cls.GetName())) +
-                            " (excludekeys, " + fText.name + ":" + std::to_string(fTrace.Find(cls.GetName()).excludedKeysLine) + ")"
-                      : "");
+           (isReduced ? reduced.description : "");
 }
 
 std::string TRulesListing::Reason(const TInMemClass& cls, const std::string& property, bool isCompared) const

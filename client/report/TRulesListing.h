@@ -1,8 +1,10 @@
 #pragma once
 
+#include <set>
 #include <string>
 #include <vector>
 
+#include "client/inventory/TInstanceCounts.h"
 #include "client/inventory/TInventory.h"
 #include "client/inventory/TSchemaNote.h"
 #include "client/rules/TRuleTrace.h"
@@ -10,6 +12,7 @@
 #include "client/rules/TRules.h"
 #include "client/rules/TRulesDocument.h"
 #include "client/rules/TRulesText.h"
+#include "embedded/value/TNameText.h"
 
 namespace NORVZEL20 {
 
@@ -36,13 +39,23 @@ class TRulesListing {
     std::string WriteExplanation(const std::string& className, const std::string& property);
 
   private:
+    using TNames = std::set<std::string, TNameText::TLess>;
+
+    // The references of a class that are compared although keys are excluded.
+    struct TReduced {
+        std::set<std::string> properties;
+        std::string description;  // how they are compared; empty if there are none
+    };
+
     void WriteElements();
-    void WriteEffective();
+    void WriteEffective(const TInstanceCounts& counts);
     void WriteEffective(const boost::shared_ptr<TInMemClass>& cls);
-    void WriteUnmatched();
+    void WriteUnmatched(const TInstanceCounts& counts);
     void WriteWarnings();
     std::string WriteRootExplanation();
-    void AddVerdicts(const TInMemClass& cls, const std::vector<std::string>& compared);
+    TNames ComparedIn(const boost::shared_ptr<TInMemClass>& cls);
+    void AddVerdicts(const TInMemClass& cls, const TNames& compared);
+    TReduced ReducedIn(const TInMemClass& cls) const;
     bool IsNeverCompared(const TInMemClass& cls) const;
     bool IsPartlyMade(const TInMemClass& cls) const;
     std::string SinceMade() const;
@@ -53,7 +66,7 @@ class TRulesListing {
     bool IsReferenceAlone() const;
     std::string PathsOfInventories() const;
     std::vector<std::string> PathsOf(const std::vector<std::size_t>& positions) const;
-    std::string Verdict(const TInMemClass& cls, const std::string& property, const std::vector<std::string>& compared);
+    std::string Verdict(const TInMemClass& cls, const std::string& property, const TNames& compared, const TReduced& reduced);
     std::string Reason(const TInMemClass& cls, const std::string& property, bool isCompared) const;
     std::string Origin(const TRuleTrace::TDecision& decision) const;
     void AddLine(const std::string& text);
@@ -67,6 +80,7 @@ class TRulesListing {
     const TRulesDocument& fDocument;
     const TRuleTrace fTrace;
     const TRuleWarnings fWarnings;
+    const TNames fNamed;  // the classes that have an element
     std::string fOut;
 };
 

@@ -44,7 +44,7 @@ TRuleTrace::TRuleTrace(const TRulesDocument& document, boost::shared_ptr<ICIMNam
     }
 }
 
-TRuleTrace::TClass TRuleTrace::Find(const std::string& className) const
+TRuleTrace::TClass TRuleTrace::Make(const std::string& className) const
 {
     TClass entry;
     const std::optional<std::size_t> byDefault = fMarks.FindDefault(className);
@@ -61,20 +61,35 @@ TRuleTrace::TClass TRuleTrace::Find(const std::string& className) const
     return entry;
 }
 
+const TRuleTrace::TRecalled& TRuleTrace::Recall(const std::string& className) const
+{
+    if (!fRecalled || fRecalled->className != className) {
+        auto recalled = std::make_unique<TRecalled>();
+        recalled->className = className;
+        recalled->rules = Make(className);
+        for (const auto& [name, decision] : recalled->rules.listed) {
+            if (decision.treatment == TCIMDiffEngine::INCLUDE) {
+                recalled->included.emplace(name, &decision);  // of names that differ in letter case, the first one
+            }
+        }
+        fRecalled = std::move(recalled);
+    }
+    return *fRecalled;
+}
+
 // As the plug-in lists what it compares. If the default is to exclude, it takes the included names; instances find a property in
 // any letter case. Otherwise it takes the declared names and leaves out the excluded ones, byte for byte.
 TRuleTrace::TDecision TRuleTrace::Decide(const std::string& className, const std::string& property) const
 {
-    const TClass entry = Find(className);
-    if (entry.byDefault.treatment == TCIMDiffEngine::EXCLUDE) {
-        for (const auto& [name, decision] : entry.listed) {
-            if (decision.treatment == TCIMDiffEngine::INCLUDE && TNameText::Equal(name, property)) {
-                return decision;
-            }
+    const TRecalled& known = Recall(className);
+    if (known.rules.byDefault.treatment == TCIMDiffEngine::EXCLUDE) {
+        const auto included = known.included.find(std::string_view(property));
+        if (included != known.included.end()) {
+            return *included->second;
         }
     }
-    const auto exact = entry.listed.find(property);
-    return exact == entry.listed.end() ? entry.byDefault : exact->second;
+    const auto exact = known.rules.listed.find(property);
+    return exact == known.rules.listed.end() ? known.rules.byDefault : exact->second;
 }
 
 std::vector<std::string> TRuleTrace::FindReducedReferences(const ICIMClass& cls) const
@@ -92,9 +107,9 @@ std::vector<std::string> TRuleTrace::FindReducedReferences(const ICIMClass& cls)
     const auto enumerate = [&cls](const auto& callback) { cls.EnumeratePropertyDecls(callback, TCallContext()); };
     for (const boost::shared_ptr<ICIMPropertyDecl>& decl : Collect<ICIMPropertyDecl>(enumerate)) {
         const std::string& name = decl->GetName(TCallContext());
-        const bool isMatched = has(keys, name) && !has(excluded, name);
-        if (decl->GetType(TCallContext()) == TCIMValue::TCIMType::kReference && !isMatched &&
-            Decide(className, name).treatment == TCIMDiffEngine::INCLUDE) {
+        const bool isReference = decl->GetType(TCallContext()) == TCIMValue::TCIMType::kReference;
+        const bool isMatched = isReference && has(keys, name) && !has(excluded, name);
+        if (isReference && !isMatched && Decide(className, name).treatment == TCIMDiffEngine::INCLUDE) {
             names.push_back(name);
         }
     }
@@ -104,13 +119,14 @@ std::vector<std::string> TRuleTrace::FindReducedReferences(const ICIMClass& cls)
 std::vector<std::string> TRuleTrace::FindKeysOfReferences(const std::string& className) const
 {
     const std::vector<std::string> excluded = Find(className).excludedKeys;
-    std::set<std::string> known = fDeclaredKeys;
-    if (std::any_of(excluded.begin(), excluded.end(), [&known](const std::string& key) { return known.count(key) == 0; })) {
-        AddKeysInReferences(*fSchema->GetClass(className, TCallContext()), known);
+    const auto isDeclared = [this](const std::string& key) { return fDeclaredKeys.count(key) != 0; };
+    std::set<std::string> found;
+    if (!std::all_of(excluded.begin(), excluded.end(), isDeclared)) {
+        AddKeysInReferences(*fSchema->GetClass(className, TCallContext()), found);
     }
     std::vector<std::string> keys;
     for (const std::string& key : excluded) {
-        if (known.count(key) != 0 && std::find(keys.begin(), keys.end(), key) == keys.end()) {
+        if ((isDeclared(key) || found.count(key) != 0) && std::find(keys.begin(), keys.end(), key) == keys.end()) {
             keys.push_back(key);
         }
     }
@@ -120,6 +136,10 @@ std::vector<std::string> TRuleTrace::FindKeysOfReferences(const std::string& cla
 void TRuleTrace::Merge(std::size_t index)
 {
     const std::string& className = fElements[index].className;
+    fListings.emplace_back();
+    for (const TRulesDocument::TListed& listed : fElements[index].listed) {
+        fListings.back().emplace(listed.property, &listed);  // the first listing counts, as in the plug-in
+    }
     TArrival arrival;
     arrival.keys = fMarks.FindKeys(className);
     if (fMarks.IsFinal(className)) {
@@ -139,13 +159,11 @@ TRuleTrace::TDecision TRuleTrace::MakeDefault(std::size_t index) const
     return {element.defaultTreatment, element.className, element.line, false};
 }
 
-// The first listing counts, as in the plug-in.
 TRuleTrace::TDecision TRuleTrace::MakeListed(std::size_t index, const std::string& property) const
 {
     const TRulesDocument::TElement& element = fElements[index];
-    const auto first = std::find_if(element.listed.begin(), element.listed.end(),
-                                    [&property](const TRulesDocument::TListed& listed) { return listed.property == property; });
-    return {first->treatment, element.className, first->line, true};
+    const TRulesDocument::TListed& listing = GetListing(index, property);
+    return {listing.treatment, element.className, listing.line, true};
 }
 
 }  // namespace NORVZEL20

@@ -183,10 +183,7 @@ void TRuleWarnings::CheckDefault(std::size_t index)
         return;
     }
     for (const auto& [property, lister] : fMarks.FindListed(element.className)) {
-        const std::vector<TRulesDocument::TListed>& listed = fElements[lister].listed;
-        const auto first =
-            std::find_if(listed.begin(), listed.end(), [&name = property](const auto& entry) { return entry.property == name; });
-        if (first->treatment == TCIMDiffEngine::INCLUDE) {
+        if (fTrace.GetListing(lister, property).treatment == TCIMDiffEngine::INCLUDE) {
             return;
         }
     }
@@ -233,11 +230,16 @@ void TRuleWarnings::CheckReferences()
     std::map<std::size_t, std::set<std::string>> keys;
     for (const boost::shared_ptr<ICIMClass>& cls : AllClassesOf(*fSchema)) {
         const std::string& className = cls->GetName(TCallContext());
-        for (const std::string& property : fTrace.FindReducedReferences(*cls)) {
-            references[*fMarks.FindKeys(className)].push_back(className + "." + property);
-            const std::vector<std::string> lost = fTrace.FindKeysOfReferences(className);
-            keys[*fMarks.FindKeys(className)].insert(lost.begin(), lost.end());
+        const std::vector<std::string> reduced = fTrace.FindReducedReferences(*cls);
+        if (reduced.empty()) {
+            continue;
         }
+        const std::size_t index = *fMarks.FindKeys(className);
+        for (const std::string& property : reduced) {
+            references[index].push_back(className + "." + property);
+        }
+        const std::vector<std::string> lost = fTrace.FindKeysOfReferences(className);
+        keys[index].insert(lost.begin(), lost.end());
     }
     for (const auto& [index, properties] : references) {
         std::vector<std::string> lost;
