@@ -7,7 +7,7 @@ const std::vector<TFuzzTarget>& TFuzzTarget::GetAll()
     static const std::vector<TFuzzTarget> fgTargets = {
         {"arguments", FuzzArguments}, {"engine", FuzzEngine}, {"inventory", FuzzInventory},
         {"path", FuzzPath},           {"query", FuzzQuery},   {"specification", FuzzSpecification},
-        {"value", FuzzValue},
+        {"tokenizer", FuzzTokenizer}, {"value", FuzzValue},
     };
     return fgTargets;
 }

@@ -22,6 +22,7 @@ void FuzzInventory(std::string_view input);      ///< a CIM-XML document
 void FuzzPath(std::string_view input);           ///< the text of an object path
 void FuzzQuery(std::string_view input);          ///< a whole query, or the condition of one
 void FuzzSpecification(std::string_view input);  ///< a specification file
+void FuzzTokenizer(std::string_view input);      ///< an XML document
 void FuzzValue(std::string_view input);          ///< the text of one value
 
 }  // namespace NORVZEL20

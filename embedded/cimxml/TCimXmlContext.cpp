@@ -9,7 +9,6 @@
 #include <utility>
 
 #include "embedded/cimxml/MessageText.h"
-#include "embedded/cimxml/TXmlReader.h"
 #include "embedded/value/TNameText.h"
 
 namespace NORVZEL20 {
@@ -37,7 +36,11 @@ void TCimXmlContext::EnterEmbeddedObject()
 
 TCimXmlContext::TPlace TCimXmlContext::GetPlace() const
 {
-    return fPlace.line > 0 ? fPlace : TPlace{fReader->GetLine(), fReader->GetColumn()};
+    if (fPlace.line > 0) {
+        return fPlace;
+    }
+    const TXmlPlace place = fReader->GetPlace();
+    return {place.line, place.column};
 }
 
 void TCimXmlContext::Tolerate(const char* kind, const std::string& text)

@@ -10,11 +10,10 @@
 #include "embedded/cimxml/TLoadReport.h"
 #include "embedded/cimxml/TPopulateError.h"
 #include "embedded/cimxml/TTextPool.h"
+#include "embedded/cimxml/TXmlReader.h"
 #include "host/Export.h"
 
 namespace NORVZEL20 {
-
-class TXmlReader;
 
 /// What all parts of one load share: the report, the place in the document, the pool of texts, and the one way to fail.
 ///
@@ -48,6 +47,11 @@ class CIMDELTA_INTERNAL_EXPORT TCimXmlContext {
 
     /// Sets the XML reader that knows the place. Call it before the load begins. The reader must outlive the load.
     void SetReader(const TXmlReader& reader) noexcept { fReader = &reader; }
+    /// Who reads the documents within the document: whoever reads that.
+    TXmlReader::EParser GetParser() const noexcept
+    {
+        return fReader != nullptr ? fReader->GetParser() : TXmlReader::EParser::kTokenizer;
+    }
 
     /// Ends the load. `message` says what was found and what was expected or can be done.
     [[noreturn]] void Fail(TZELStatusCode::EStatusCode status, const std::string& message) const;

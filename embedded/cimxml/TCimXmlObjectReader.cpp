@@ -24,7 +24,7 @@ namespace NORVZEL20 {
 class TCimXmlObjectReader::TNested {
   public:
     TNested(TCimXmlContext& context, const boost::shared_ptr<const TInMemNamespace>& ns)
-        : fContext(context), fReader(context, ns, nullptr), fXml(fReader)
+        : fContext(context), fReader(context, ns, nullptr), fXml(fReader, context.GetParser())
     {
         fXml.RefuseDocumentTypes();
     }

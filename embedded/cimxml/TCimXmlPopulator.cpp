@@ -65,8 +65,8 @@ class TFileSource {
 /// One load, from its first byte to its end.
 class TLoad {
   public:
-    TLoad(const boost::shared_ptr<TInMemNamespace>& ns, const std::string& name)
-        : fContext(name), fLoader(fContext, ns), fReader(fContext, ns, &fLoader), fXml(fReader)
+    TLoad(const boost::shared_ptr<TInMemNamespace>& ns, const std::string& name, TXmlReader::EParser parser)
+        : fContext(name), fLoader(fContext, ns), fReader(fContext, ns, &fLoader), fXml(fReader, parser)
     {
         fContext.SetReader(fXml);
     }
@@ -83,7 +83,7 @@ class TLoad {
         std::size_t length = 0;
         std::size_t room = 0;
         do {
-            // Expat reads a tag that has not ended again with each piece. Pieces as long as that tag keep the total linear.
+            // A tag that has not ended is read again with each piece. Pieces as long as that tag keep the total linear.
             room = std::max(kReadPiece, fXml.GetPending());
             length = Fill(source, fXml.GetBuffer(room), room);
             total += length;
@@ -154,7 +154,7 @@ TLoadReport TCimXmlPopulator::Load(const std::string& name, TRead read)
         throw TPopulateError(EStatus::kNotSupported, "the namespace is not one of the provider \"inmem\"; load into one of those",
                              name, 0, 0);
     }
-    TLoad load(ns, name);
+    TLoad load(ns, name, fUsesExpatAlone ? TXmlReader::EParser::kExpat : TXmlReader::EParser::kTokenizer);
     if (fKeep) {
         load.GetLoader().KeepElements();
     }

@@ -30,8 +30,8 @@ namespace NORVZEL20 {
 /// namespace is not one of the provider "inmem"; std::bad_alloc. Nothing is logged.
 /// Threads: use a populator, and a namespace, from one thread at a time; different populators may load into different namespaces
 /// concurrently.
-/// Cost: one pass over the document. It is never held whole, except that LoadFromMemory makes the XML library copy it.
-/// Bounds: a document that exceeds one is refused with kParseError (9). They are those of TXmlReader; 1000 superclasses of a class;
+/// Cost: one pass over the document, which is never held whole.
+/// Bounds: a document that exceeds one is refused with kParseError (9). They are those of TXmlLimits; 1000 superclasses of a class;
 /// 1024 properties of a class, an instance or an embedded object; 1024 methods of a class; 1024 qualifiers of an element; 256 key
 /// bindings of a path; 12 paths and 32 embedded objects inside of each other. Inherited parts count. An embedded object with a
 /// document type declaration is refused with kTypeMismatch (13).
@@ -57,6 +57,10 @@ class CIMDELTA_EXPORT TCimXmlPopulator {
     /// From now on remembers what each load adds, for TakeElements.
     void KeepElements() { fKeep = true; }
 
+    /// From now on reads documents through Expat alone: the results are the same, and loading takes several times as long. For
+    /// tests.
+    void UseExpatAlone() { fUsesExpatAlone = true; }
+
     /// The classes, then the instances of the last load that did not fail, each in the document's order. Empty without KeepElements
     /// and when called again.
     std::vector<boost::shared_ptr<ICIMElement>> TakeElements();
@@ -67,6 +71,7 @@ class CIMDELTA_EXPORT TCimXmlPopulator {
 
     boost::shared_ptr<ICIMNamespace> fNamespace;
     bool fKeep = false;
+    bool fUsesExpatAlone = false;
     std::vector<boost::shared_ptr<ICIMElement>> fElements;
 };
 

@@ -19,6 +19,7 @@
 #include <utility>
 
 #include "embedded/cimxml/MessageText.h"
+#include "embedded/cimxml/TXmlCharacter.h"
 #include "embedded/value/TValueText.h"
 
 namespace NORVZEL20 {
@@ -84,7 +85,7 @@ void TCimXmlReader::CheckBlank() const
     if (fText.empty() || TTable::TakesText(GetState())) {
         return;
     }
-    if (!std::all_of(fText.begin(), fText.end(), TXmlReader::IsBlank)) {
+    if (!std::all_of(fText.begin(), fText.end(), TXmlCharacter::IsBlank)) {
         fContext.Fail(EStatus::kParseError, "found text " + Quote(fText) + " in <" + TElement::GetName(fOpen.back().element) +
                                                 ">, expected only elements");
     }

@@ -4,6 +4,7 @@
 #include <string_view>
 #include <vector>
 
+#include "embedded/cimxml/IXmlSink.h"
 #include "embedded/cimxml/TCimXmlAttributes.h"
 #include "embedded/cimxml/TCimXmlContext.h"
 #include "embedded/cimxml/TCimXmlDraftBuilder.h"
@@ -13,7 +14,6 @@
 #include "embedded/cimxml/TCimXmlPathReader.h"
 #include "embedded/cimxml/TCimXmlQualifierReader.h"
 #include "embedded/cimxml/TCimXmlTable.h"
-#include "embedded/cimxml/TXmlReader.h"
 
 namespace NORVZEL20 {
 
@@ -22,7 +22,7 @@ namespace NORVZEL20 {
 /// Qualifier declarations, classes and instances go to the loader. A reader without a loader reads the text of one embedded object,
 /// which TakeObject then returns.
 /// Errors: the events fail through the context, with kParseError (9) for what the table does not accept.
-class TCimXmlReader : public TXmlReader::ISink {
+class TCimXmlReader : public IXmlSink {
   public:
     /// The classes of references are looked up in `ns` (may be null). `context` and `loader` (may be null) must outlive the reader.
     TCimXmlReader(TCimXmlContext& context, const boost::shared_ptr<const TInMemNamespace>& ns, TCimXmlLoader* loader);

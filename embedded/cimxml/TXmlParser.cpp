@@ -11,7 +11,7 @@
 namespace NORVZEL20 {
 
 /// Turns the reader's events into calls on the parser.
-class TXmlParser::TEvents : public TXmlReader::ISink {
+class TXmlParser::TEvents : public IXmlSink {
   public:
     explicit TEvents(TXmlParser& parser) : fParser(parser), fReader(*this) {}
 
@@ -111,12 +111,12 @@ void TXmlParser::Parse(char* text, std::size_t length)
 
 unsigned int TXmlParser::GetCurLine() const
 {
-    return static_cast<unsigned int>(fEvents->GetReader().GetLine());
+    return static_cast<unsigned int>(fEvents->GetReader().GetPlace().line);
 }
 
 unsigned int TXmlParser::GetCurColumn() const
 {
-    return static_cast<unsigned int>(fEvents->GetReader().GetColumn());
+    return static_cast<unsigned int>(fEvents->GetReader().GetPlace().column);
 }
 
 }  // namespace NORVZEL20

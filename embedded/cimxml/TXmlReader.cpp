@@ -1,290 +1,150 @@
-// XML over Expat, with limits.
+// Two parsers, one after the other.
 //
-// Pieces. Bytes may be handed over in pieces of any length, which may end within a tag or a character. Expat keeps what it has not
-// finished and delivers character data in pieces too; the reader gathers those and hands the text over whole, before the next tag.
-//
-// Entities. Expat expands internal entities itself and bounds how much they may amplify the input. It does not see two things: how
-// long attribute defaults become when they are handed out for every element, and how deep expansion recurses on the stack. So the
-// reader adds up defaults and counts declarations. External entities are refused, and no file is ever opened.
-//
-// Exceptions. A C library must not be unwound. A callback catches what the sink throws and stops the parser; Settle throws it again
-// when Expat has returned. Expat may deliver a few events after it was stopped, so each callback checks that first.
+// A document begins with the tokenizer. When it meets a token that it does not accept, Expat goes on from there: it gets the start
+// tags of the open elements, of which the sink sees nothing, then the refused token and all that follows. Lines and columns are
+// shifted to where the token stands. So nothing that has been read need be kept, and whether a document is in error, why and where,
+// is always said by Expat.
 #include "embedded/cimxml/TXmlReader.h"
 
-#ifndef XML_DTD
-#define XML_DTD  // without it the header hides functions that the library has, among them the limits of entity expansion
-#endif
-#include <expat.h>
-
 #include <algorithm>
-#include <climits>
 #include <cstring>
-#include <new>
-#include <utility>
+#include <string_view>
+
+#include "embedded/cimxml/TExpatReader.h"
+#include "embedded/cimxml/TXmlTokenizer.h"
 
 namespace NORVZEL20 {
 
-void TXmlReader::TFree::operator()(XML_ParserStruct* parser) const noexcept
+TXmlReader::TXmlReader(IXmlSink& sink, EParser parser)
+    : fParser(parser), fTokenizer(std::make_unique<TXmlTokenizer>(sink)), fExpat(std::make_unique<TExpatReader>(sink))
 {
-    XML_ParserFree(parser);
-}
-
-/// What the C library calls. Nothing thrown leaves these functions.
-struct TXmlReader::TCallbacks {
-    template <class TAction>
-    static void Guarded(void* user, TAction action) noexcept
-    {
-        TXmlReader& reader = *static_cast<TXmlReader*>(user);
-        if (reader.fStopped) {
-            return;
-        }
-        try {
-            action(reader);
-        } catch (...) {
-            reader.fException = std::current_exception();
-            reader.Stop();
-        }
-    }
-
-    static void Start(void* user, const char* name, const char** attributes) noexcept
-    {
-        Guarded(user, [=](TXmlReader& reader) {
-            // The bounds are checked before the sink sees anything of the element.
-            if (++reader.fDepth > kMaxDepth) {
-                return reader.Refuse("elements are nested too deeply");
-            }
-            if (static_cast<std::size_t>(XML_GetCurrentByteCount(reader.fParser.get())) > kMaxTokenLength) {
-                return reader.Refuse("a tag is too long");
-            }
-            if (const char* reason = reader.FindExcess(attributes)) {
-                return reader.Refuse(reason);
-            }
-            reader.HandOverText();
-            reader.fSink.OnStart(name, attributes);
-            reader.fText.clear();
-        });
-    }
-
-    static void End(void* user, const char* name) noexcept
-    {
-        Guarded(user, [=](TXmlReader& reader) {
-            --reader.fDepth;
-            reader.HandOverText();
-            reader.fSink.OnEnd(name);
-            reader.fText.clear();
-        });
-    }
-
-    static void Text(void* user, const char* text, int length) noexcept
-    {
-        Guarded(user, [=](TXmlReader& reader) {
-            if (reader.fText.size() + static_cast<std::size_t>(length) > kMaxTextLength) {
-                return reader.Refuse("text is too long");
-            }
-            reader.fText.append(text, static_cast<std::size_t>(length));
-        });
-    }
-
-    static void Instruction(void* user, const char* target, const char* data) noexcept
-    {
-        Guarded(user, [=](TXmlReader& reader) { reader.fSink.OnProcessingInstruction(target, data); });
-    }
-
-    static void Notation(void* user, const char* name, const char*, const char* systemId, const char* publicId) noexcept
-    {
-        Guarded(user, [=](TXmlReader& reader) { reader.fSink.OnNotation(name, publicId, systemId); });
-    }
-
-    static void DocumentType(void* user, const char*, const char*, const char*, int) noexcept
-    {
-        Guarded(user, [](TXmlReader& reader) { reader.Refuse("a document type declaration is not allowed here"); });
-    }
-
-    /// Entities expand recursively inside of the library, so their number bounds its stack.
-    static void Entity(void* user, const char*, int, const char*, int, const char*, const char*, const char*, const char*) noexcept
-    {
-        Guarded(user, [](TXmlReader& reader) {
-            if (++reader.fEntities > kMaxEntities) {
-                reader.Refuse("too many entity declarations");
-            }
-        });
-    }
-
-    static int ExternalEntity(XML_Parser parser, const char*, const char*, const char*, const char*) noexcept
-    {
-        Guarded(XML_GetUserData(parser), [](TXmlReader& reader) { reader.Refuse("external entities are not read"); });
-        return XML_STATUS_ERROR;
-    }
-
-    /// Expat does not report an undeclared entity itself if the document has a DTD that was not read.
-    static void SkippedEntity(void* user, const char*, int) noexcept
-    {
-        Guarded(user, [](TXmlReader& reader) { reader.Refuse("undeclared entity"); });
-    }
-};
-
-TXmlReader::TXmlReader(ISink& sink) : fSink(sink), fParser(XML_ParserCreate(nullptr))
-{
-    if (!fParser) {
-        throw std::bad_alloc();
-    }
-    Install();
+    Reset();
 }
 
 TXmlReader::~TXmlReader() = default;
 
-void TXmlReader::Install()
+void TXmlReader::RefuseDocumentTypes() noexcept
 {
-    XML_Parser parser = fParser.get();
-    XML_SetUserData(parser, this);
-    XML_SetElementHandler(parser, TCallbacks::Start, TCallbacks::End);
-    XML_SetCharacterDataHandler(parser, TCallbacks::Text);
-    XML_SetProcessingInstructionHandler(parser, TCallbacks::Instruction);
-    XML_SetNotationDeclHandler(parser, TCallbacks::Notation);
-    XML_SetStartDoctypeDeclHandler(parser, fRefusesDocumentTypes ? TCallbacks::DocumentType : nullptr);
-    XML_SetEntityDeclHandler(parser, TCallbacks::Entity);
-    XML_SetExternalEntityRefHandler(parser, TCallbacks::ExternalEntity);
-    XML_SetSkippedEntityHandler(parser, TCallbacks::SkippedEntity);
-    XML_SetBillionLaughsAttackProtectionMaximumAmplification(parser, kMaxAmplification);
-    XML_SetBillionLaughsAttackProtectionActivationThreshold(parser, kExpansionThreshold);
+    fExpat->RefuseDocumentTypes();
 }
 
 void TXmlReader::Reset(const char* encoding)
 {
-    // Passing the encoding to the reset would silently fall back to the document's own if memory is short.
-    XML_ParserReset(fParser.get(), nullptr);
-    if (encoding != nullptr && XML_SetEncoding(fParser.get(), encoding) == XML_STATUS_ERROR) {
-        throw std::bad_alloc();
+    fEncoding = encoding;
+    fIsStopped = false;
+    fIsTokenizing = fParser == EParser::kTokenizer && (encoding == nullptr || std::strcmp(encoding, "UTF-8") == 0);
+    fTokenizer->Reset();
+    if (!fIsTokenizing) {
+        fExpat->Reset(encoding, TXmlProgress());
     }
-    Install();
-    fText.clear();
-    fDepth = fEntities = fBytes = fDefaultBytes = 0;
-    fError.clear();
-    fException = nullptr;
-    fStopped = false;
 }
 
-/// Why the attributes are too many or too long; null if they are not.
-const char* TXmlReader::FindExcess(const char** attributes)
-{
-    const auto specified = static_cast<std::size_t>(XML_GetSpecifiedAttributeCount(fParser.get()));  // names and values
-    std::size_t count = specified;
-    for (; attributes[count] != nullptr; count += 2) {
-        fDefaultBytes += std::strlen(attributes[count + 1]);
-    }
-    if (count > 2 * kMaxAttributes) {
-        return "too many attributes";
-    }
-    if (count > specified && fDefaultBytes > kExpansionThreshold &&
-        static_cast<double>(fDefaultBytes) > kMaxAmplification * static_cast<double>(fBytes)) {
-        return "attribute defaults expand too much";
-    }
-    return nullptr;
-}
-
-/// Expat takes lengths as int, so longer text is parsed in pieces.
 bool TXmlReader::Parse(const char* data, std::size_t length, bool last)
 {
-    while (!fStopped && (length > 0 || last)) {
-        // Half of the range leaves the library room for what it kept of the piece before.
-        const std::size_t piece = std::min<std::size_t>(length, INT_MAX / 2);
-        const bool final = last && piece == length;
-        fBytes += piece;
-        if (!Settle(XML_Parse(fParser.get(), data, static_cast<int>(piece), final) != XML_STATUS_ERROR)) {
-            return false;
-        }
-        if (final) {
-            break;
-        }
-        data += piece;
-        length -= piece;
-    }
-    return fError.empty();
+    return fIsTokenizing ? ParseFromMemory(data, length, last) : fExpat->Parse(data, length, last);
 }
 
-bool TXmlReader::Finish()
+/// The tokenizer gets the bytes in slices that stay in the processor's cache. If it leaves a token to Expat, that reads on in
+/// `data`.
+bool TXmlReader::ParseFromMemory(const char* data, std::size_t length, bool last)
 {
-    return Parse("", 0, true);
+    constexpr std::size_t kSlice = 64 * 1024;
+    std::size_t done = 0;
+    do {
+        const std::size_t slice = std::min(length - done, kSlice);
+        char* const room = fTokenizer->GetRoom(slice);
+        if (slice > 0) {
+            std::memcpy(room, data + done, slice);
+        }
+        done += slice;
+        if (fIsStopped || Scan(slice, last && done == length)) {
+            continue;
+        }
+        Leave();
+        const std::string_view rest = fTokenizer->GetRest();
+        const std::size_t earlier = rest.size() - std::min(rest.size(), done);
+        const std::size_t from = done - (rest.size() - earlier);
+        if (earlier > 0 && !fExpat->Parse(rest.data(), earlier, false)) {
+            return false;
+        }
+        fTokenizer->ReleaseMemory();
+        return fExpat->Parse(data + from, length - from, last);
+    } while (done < length);
+    return true;
+}
+
+/// Lets the tokenizer read on with bytes that are in its room. Returns false if it leaves the next token to Expat.
+bool TXmlReader::Scan(std::size_t length, bool last)
+{
+    try {
+        return fTokenizer->Scan(length, last) != TXmlTokenizer::EOutcome::kLeave;
+    } catch (...) {
+        Stop();
+        throw;
+    }
+}
+
+/// From now on Expat reads.
+void TXmlReader::Leave()
+{
+    const TXmlProgress progress = fTokenizer->TakeProgress();
+    // The tokenizer has accepted the beginning as UTF-8.
+    fExpat->Reset(progress.tags.empty() ? fEncoding : "UTF-8", progress);
+    fIsTokenizing = false;
 }
 
 char* TXmlReader::GetBuffer(std::size_t length)
 {
-    void* buffer = length > INT_MAX / 2 ? nullptr : XML_GetBuffer(fParser.get(), static_cast<int>(length));
-    if (buffer == nullptr) {
-        throw std::bad_alloc();
-    }
-    return static_cast<char*>(buffer);
+    return fIsTokenizing ? fTokenizer->GetRoom(length) : fExpat->GetBuffer(length);
 }
 
 bool TXmlReader::ParseBuffer(std::size_t length)
 {
-    if (fStopped) {
-        return fError.empty();
+    if (!fIsTokenizing) {
+        return fExpat->ParseBuffer(length);
     }
-    fBytes += length;
-    return Settle(XML_ParseBuffer(fParser.get(), static_cast<int>(length), XML_FALSE) != XML_STATUS_ERROR);
-}
-
-/// Checks what a call of the library has left: a stopped parse, an error of the library, or a tag that is too long already.
-bool TXmlReader::Settle(bool succeeded)
-{
-    if (fException) {
-        std::rethrow_exception(std::exchange(fException, nullptr));
+    if (fIsStopped || Scan(length, false)) {
+        return true;
     }
-    if (fStopped) {
-        return fError.empty();
-    }
-    if (!succeeded) {
-        const XML_Error code = XML_GetErrorCode(fParser.get());
-        // A lack of memory is no error of the document.
-        if (code == XML_ERROR_NO_MEMORY) {
-            throw std::bad_alloc();
-        }
-        Refuse(XML_ErrorString(code));
-        return false;
-    }
-    if (GetPending() > kMaxTokenLength) {
-        Refuse("a tag is too long");
-    }
-    return fError.empty();
+    Leave();
+    const std::string_view rest = fTokenizer->GetRest();
+    const bool isParsed = fExpat->Parse(rest.data(), rest.size(), false);
+    fTokenizer->ReleaseMemory();
+    return isParsed;
 }
 
 std::size_t TXmlReader::GetPending() const
 {
-    const XML_Index index = XML_GetCurrentByteIndex(fParser.get());
-    return index < 0 ? 0 : fBytes - static_cast<std::size_t>(index);
+    return fIsTokenizing ? fTokenizer->GetRest().size() : fExpat->GetPending();
 }
 
 void TXmlReader::Stop()
 {
-    fLine = GetLine();  // the library moves on a little after it is stopped
-    fColumn = GetColumn();
-    fStopped = true;
-    XML_StopParser(fParser.get(), XML_FALSE);
-}
-
-/// Ends the parse for a reason of this reader, with the place of the event.
-void TXmlReader::Refuse(const char* reason)
-{
-    fError = reason;
-    Stop();
-}
-
-void TXmlReader::HandOverText()
-{
-    if (!fText.empty()) {
-        fSink.OnText(fText.c_str(), fText.size());
+    if (!fIsTokenizing) {
+        return fExpat->Stop();
     }
+    fPlace = fTokenizer->GetPlace();
+    fTokenizer->Stop();
+    fIsStopped = true;
 }
 
-std::size_t TXmlReader::GetLine() const
+const std::string& TXmlReader::GetError() const noexcept
 {
-    return fStopped ? fLine : XML_GetCurrentLineNumber(fParser.get());
+    static const std::string fgNone;
+    return fIsTokenizing ? fgNone : fExpat->GetError();
 }
 
-std::size_t TXmlReader::GetColumn() const
+TXmlPlace TXmlReader::GetPlace() const
 {
-    return fStopped ? fColumn : XML_GetCurrentColumnNumber(fParser.get()) + 1;
+    if (!fIsTokenizing) {
+        return fExpat->GetPlace();
+    }
+    return fIsStopped ? fPlace : fTokenizer->GetPlace();
+}
+
+std::size_t TXmlReader::CountTokens() const noexcept
+{
+    return fTokenizer->CountTokens();
 }
 
 }  // namespace NORVZEL20

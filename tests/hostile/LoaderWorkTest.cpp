@@ -9,7 +9,7 @@ namespace NORVZEL20 {
 
 namespace {
 
-struct TNoSink : TXmlReader::ISink {
+struct TNoSink : IXmlSink {
     void OnStart(const char*, const char**) override {}
     void OnEnd(const char*) override {}
     void OnText(const char*, std::size_t) override {}

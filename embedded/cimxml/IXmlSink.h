@@ -1,0 +1,22 @@
+#pragma once
+
+#include <cstddef>
+
+namespace NORVZEL20 {
+
+/// Receives the events of an XML document. Pointers are valid only during the call, unless said otherwise.
+class IXmlSink {
+  public:
+    virtual ~IXmlSink() = default;
+
+    /// `attributes` alternates names and values and ends with null.
+    virtual void OnStart(const char* name, const char** attributes) = 0;
+    virtual void OnEnd(const char* name) = 0;
+    /// Called before a tag with the text between it and the tag before, unless that is empty. A NUL follows the text. The text
+    /// stays valid until the tag's own event returns.
+    virtual void OnText(const char* text, std::size_t length) = 0;
+    virtual void OnProcessingInstruction(const char*, const char*) {}
+    virtual void OnNotation(const char*, const char*, const char*) {}
+};
+
+}  // namespace NORVZEL20

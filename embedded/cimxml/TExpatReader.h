@@ -1,0 +1,70 @@
+#pragma once
+
+#include <cstddef>
+#include <exception>
+#include <memory>
+#include <string>
+
+#include "embedded/cimxml/IXmlSink.h"
+#include "embedded/cimxml/TXmlPlace.h"
+#include "embedded/cimxml/TXmlProgress.h"
+
+struct XML_ParserStruct;
+
+namespace NORVZEL20 {
+
+/// Reads XML 1.0 through Expat, from the beginning of a document or from where another parser has stopped. No other code calls that
+/// library. TXmlReader describes what both do together, and has the same operations.
+///
+/// Order of calls: Reset before everything else.
+class TExpatReader {
+  public:
+    /// The sink must outlive the reader.
+    explicit TExpatReader(IXmlSink& sink);
+    TExpatReader(const TExpatReader&) = delete;
+    TExpatReader& operator=(const TExpatReader&) = delete;
+    ~TExpatReader();
+
+    void RefuseDocumentTypes() noexcept { fRefusesDocumentTypes = true; }
+
+    /// Makes the reader ready for a document that has been read as far as `progress` says. `encoding` (may be null) overrides the
+    /// one that the document declares. Errors: std::bad_alloc.
+    void Reset(const char* encoding, const TXmlProgress& progress);
+
+    bool Parse(const char* data, std::size_t length, bool last);
+    char* GetBuffer(std::size_t length);
+    bool ParseBuffer(std::size_t length);
+    std::size_t GetPending() const;
+    void Stop();
+    const std::string& GetError() const noexcept { return fError; }
+    TXmlPlace GetPlace() const;
+
+  private:
+    struct TCallbacks;
+    struct TFree {
+        void operator()(XML_ParserStruct* parser) const noexcept;
+    };
+
+    void Install();
+    bool Settle(bool succeeded);
+    void Refuse(const char* reason);
+    const char* FindExcess(const char** attributes);
+    void HandOverText();
+
+    IXmlSink& fSink;
+    std::unique_ptr<XML_ParserStruct, TFree> fParser;  // made when it is first needed
+    std::string fText;
+    std::size_t fDepth = 0;
+    std::size_t fEntities = 0;
+    std::size_t fBytes = 0;
+    std::size_t fDefaultBytes = 0;   // of attributes that an element leaves out and the document type declares
+    std::size_t fLinesBefore = 0;    // in front of the library's first line
+    std::size_t fColumnsBefore = 0;  // in front of its first column; wraps around below 0
+    std::string fError;
+    std::exception_ptr fException;
+    bool fStopped = false;
+    bool fRefusesDocumentTypes = false;
+    TXmlPlace fPlace;  // at which the parse was stopped
+};
+
+}  // namespace NORVZEL20

@@ -1,0 +1,81 @@
+#pragma once
+
+#include <emmintrin.h>
+
+#include <algorithm>
+#include <cstddef>
+
+#include "embedded/cimxml/TPlainXmlSearch.h"
+
+namespace NORVZEL20 {
+
+/// The searches of the tokenizer with SSE2, 16 bytes at a time: see TXmlSearch.
+struct TSse2XmlSearch {
+    TSse2XmlSearch() = delete;
+
+    static const char* FindSpecial(const char* from, char delimiter) noexcept
+    {
+        const __m128i less = _mm_set1_epi8('<');
+        const __m128i ampersand = _mm_set1_epi8('&');
+        const __m128i last = _mm_set1_epi8(delimiter);
+        const __m128i blank = _mm_set1_epi8(' ');
+        for (;; from += kStep) {
+            const __m128i bytes = Load(from);
+            const __m128i isMarkup = _mm_or_si128(_mm_cmpeq_epi8(bytes, less), _mm_cmpeq_epi8(bytes, ampersand));
+            // The comparison is signed, so bytes beyond ASCII are less than a blank too.
+            const __m128i isOther = _mm_or_si128(_mm_cmpeq_epi8(bytes, last), _mm_cmplt_epi8(bytes, blank));
+            const int mask = _mm_movemask_epi8(_mm_or_si128(isMarkup, isOther));
+            if (mask != 0) {
+                return from + __builtin_ctz(static_cast<unsigned int>(mask));
+            }
+        }
+    }
+
+    static bool AreSame(const char* one, const char* other, std::size_t length) noexcept
+    {
+        std::size_t done = 0;
+        for (; done + kStep <= length; done += kStep) {
+            if (CompareStep(one + done, other + done) != kAll) {
+                return false;
+            }
+        }
+        // The last step may reach beyond the end of both.
+        const unsigned int rest = (1U << (length - done)) - 1;
+        return done == length || (CompareStep(one + done, other + done) & rest) == rest;
+    }
+
+    static std::size_t CountLineEnds(const char* from, const char* to) noexcept
+    {
+        const __m128i lineFeed = _mm_set1_epi8('\n');
+        const __m128i carriageReturn = _mm_set1_epi8('\r');
+        std::size_t count = 0;
+        while (static_cast<std::size_t>(to - from) >= kStep) {
+            // Each byte of the sum counts to 255 at most.
+            const std::size_t steps = std::min<std::size_t>(static_cast<std::size_t>(to - from) / kStep, 255);
+            __m128i sum = _mm_setzero_si128();
+            for (std::size_t step = 0; step < steps; ++step, from += kStep) {
+                const __m128i bytes = Load(from);
+                const __m128i isLast = _mm_cmpeq_epi8(bytes, lineFeed);
+                const __m128i isAlone =
+                    _mm_andnot_si128(_mm_cmpeq_epi8(Load(from + 1), lineFeed), _mm_cmpeq_epi8(bytes, carriageReturn));
+                sum = _mm_sub_epi8(sum, _mm_or_si128(isLast, isAlone));  // true is -1
+            }
+            sum = _mm_sad_epu8(sum, _mm_setzero_si128());
+            count += static_cast<std::size_t>(_mm_cvtsi128_si64(sum)) +
+                     static_cast<std::size_t>(_mm_cvtsi128_si64(_mm_unpackhi_epi64(sum, sum)));
+        }
+        return count + TPlainXmlSearch::CountLineEnds(from, to);
+    }
+
+  private:
+    static constexpr std::size_t kStep = 16;
+    static constexpr unsigned int kAll = 0xFFFF;
+
+    static __m128i Load(const char* from) noexcept { return _mm_loadu_si128(reinterpret_cast<const __m128i*>(from)); }
+    static unsigned int CompareStep(const char* one, const char* other) noexcept
+    {
+        return static_cast<unsigned int>(_mm_movemask_epi8(_mm_cmpeq_epi8(Load(one), Load(other))));
+    }
+};
+
+}  // namespace NORVZEL20

@@ -1,0 +1,17 @@
+#pragma once
+
+#include "embedded/cimxml/EXmlScan.h"
+
+namespace NORVZEL20 {
+
+/// The declaration at the beginning of a document: <?xml version="1.0" encoding="utf-8" standalone="yes"?>
+class TXmlDeclaration {
+  public:
+    TXmlDeclaration() = delete;
+
+    /// Moves `at`, the beginning of a document, over the declaration, if there is one. Refuses versions and encodings other than
+    /// these. The bytes end at `end`, and a NUL is there.
+    static EXmlScan Pass(const char*& at, const char* end) noexcept;
+};
+
+}  // namespace NORVZEL20

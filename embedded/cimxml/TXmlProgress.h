@@ -1,0 +1,18 @@
+#pragma once
+
+#include <cstddef>
+#include <string>
+
+#include "embedded/cimxml/TXmlPlace.h"
+
+namespace NORVZEL20 {
+
+/// How far a document has been read: what another parser needs to go on from there.
+struct TXmlProgress {
+    std::string tags;       ///< tags that bring a parser to the same depth: of the open elements, or of an element that has ended
+    std::size_t depth = 0;  ///< open elements
+    std::string text;       ///< since the last tag
+    TXmlPlace place;        ///< of the next byte
+};
+
+}  // namespace NORVZEL20
