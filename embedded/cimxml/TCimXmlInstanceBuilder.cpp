@@ -69,13 +69,21 @@ TCimXmlTarget TCimXmlInstanceBuilder::FindProperty(const char* name)
         fContext.Fail(EStatus::kNotFound, "found property " + Quote(name) + ", but class " + Quote(cls.GetName()) +
                                               " declares no such property; add its declaration or correct the name");
     }
-    if (fLayout->given[slot] == fNumber) {
+    if (!TakeSlot(slot)) {
         fContext.Fail(EStatus::kParseError, DescribeSecondProperty(name, "instance"));
+    }
+    const TInMemPropertyDecl& decl = cls.GetLayout().GetDecl(slot);
+    return {&decl.GetName(), slot, decl.GetType(), fLayout->embedded[slot], decl.IsStatic()};
+}
+
+bool TCimXmlInstanceBuilder::TakeSlot(std::uint32_t slot) noexcept
+{
+    if (fLayout->given[slot] == fNumber) {
+        return false;
     }
     fLayout->given[slot] = fNumber;
     fExpected = fLayout->positions[slot] + 1;
-    const TInMemPropertyDecl& decl = cls.GetLayout().GetDecl(slot);
-    return {&decl.GetName(), slot, decl.GetType(), fLayout->embedded[slot], decl.IsStatic()};
+    return true;
 }
 
 void TCimXmlInstanceBuilder::SetProperty(const TCimXmlTarget& target, TCIMValue&& value, bool isUnsettled)

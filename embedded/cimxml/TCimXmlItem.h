@@ -58,6 +58,8 @@ class TCimXmlItem {
     void AddNull() { fElements.push_back(TCIMValue::Null(fType.GetElementType())); }
     void EndArray();
 
+    TType GetType() const noexcept { return fType; }
+    EText GetText() const noexcept { return fText; }
     bool IsNull() const noexcept { return fValue.IsNull(); }
     /// The value, or a null of the item's type.
     TCIMValue Take();

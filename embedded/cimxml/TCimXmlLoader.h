@@ -36,10 +36,12 @@ class CIMDELTA_INTERNAL_EXPORT TCimXmlLoader {
     /// See TCimXmlClassQueue::Add.
     void AddClass(TCimXmlDraft draft);
 
-    /// Starts an instance. If it returns false, read the instance as a draft and call AddInstance; otherwise call FindProperty and
-    /// SetProperty for each of its properties (see TCimXmlInstanceBuilder), then EndInstance.
+    /// Starts an instance. If it returns false, read the instance as a draft and call AddInstance; otherwise call FindProperty or
+    /// TakeSlot, and SetProperty, for each of its properties (see TCimXmlInstanceBuilder), then EndInstance.
     bool BeginInstance(const char* className);
     TCimXmlTarget FindProperty(const char* name) { return fBuilder.FindProperty(name); }
+    const TCimXmlLayout* GetLayout() const noexcept { return fBuilder.GetLayout(); }
+    bool TakeSlot(std::uint32_t slot) noexcept { return fBuilder.TakeSlot(slot); }
     void SetProperty(const TCimXmlTarget& target, TCIMValue&& value, bool isUnsettled)
     {
         fBuilder.SetProperty(target, std::move(value), isUnsettled);

@@ -4,23 +4,21 @@
 // element which state comes next and which action to do; when it ends, the state alone says the action. The actions put together:
 //
 //     object paths             TCimXmlPathReader
-//     values                   TCimXmlItem (of a property, or of a qualifier, which TCimXmlQualifierReader reads)
-//     embedded objects         TCimXmlObjectReader, which runs another reader over the value's text
+//     values                   TCimXmlItem (of a property, which TCimXmlPropertyReader reads, or of a qualifier:
+//     TCimXmlQualifierReader) embedded objects         TCimXmlObjectReader, which runs another reader over the value's text
 //     classes, instances       TCimXmlDraftBuilder
 //
 // What is complete goes to the loader. There is a short cut for what inventories are made of: an instance whose class is declared
-// needs no draft; the loader allocates it at once, and each property goes straight to its slot. So a property allocates no memory
-// here, and its declared type spares looking up the name of its type.
+// needs no draft; the loader allocates it at once, and each property goes straight to its slot. Tags that come again have a number,
+// by which their element is found.
 #include "embedded/cimxml/TCimXmlReader.h"
 
 #include <algorithm>
 #include <boost/smart_ptr/make_shared.hpp>
-#include <cstring>
 #include <utility>
 
 #include "embedded/cimxml/MessageText.h"
 #include "embedded/cimxml/TXmlCharacter.h"
-#include "embedded/value/TValueText.h"
 
 namespace NORVZEL20 {
 
@@ -28,17 +26,11 @@ namespace {
 
 using EStatus = TZELStatusCode::EStatusCode;
 
-/// Servers write the attribute in either letter case, some of them both.
-bool IsMarkedEmbedded(const TCimXmlAttributes& attributes)
-{
-    return attributes.Find("EmbeddedObject") != nullptr || attributes.Find("EMBEDDEDOBJECT") != nullptr;
-}
-
 }  // namespace
 
 TCimXmlReader::TCimXmlReader(TCimXmlContext& context, const boost::shared_ptr<const TInMemNamespace>& ns, TCimXmlLoader* loader)
     : fContext(context), fLoader(loader), fPaths(context, ns), fObjects(context, ns, fPaths), fDraft(context),
-      fProperty(context, fObjects), fQualifier(context, fObjects)
+      fProperty(context, fObjects, loader, fPaths, fDraft), fQualifier(context, fObjects)
 {
     Reset();
 }
@@ -57,16 +49,39 @@ boost::shared_ptr<const TEmbeddedObject> TCimXmlReader::TakeObject() noexcept
 
 void TCimXmlReader::OnStart(const char* name, const char** attributes)
 {
-    CheckBlank();
     const TElement::EElement element = TElement::Find(name);
+    const TTable::EAction action = Enter(name, element);
+    fContext.Guard([&] { Begin(action, TCimXmlAttributes(fContext, element, attributes)); });
+}
+
+void TCimXmlReader::OnKnownStart(std::size_t number, const char* name, const char** attributes)
+{
+    if (number >= fKnown.size()) {
+        fKnown.resize(number + 1, TElement::kCount);
+    }
+    TElement::EElement& element = fKnown[number];
+    element = element == TElement::kCount ? TElement::Find(name) : element;
+    const TTable::EAction action = Enter(name, element);
+    const TCimXmlAttributes known(fContext, element, attributes);
+    if (action == TTable::kBeginProperty && fIsDirect) {
+        fItem = &fProperty.GetItem();
+        return fContext.Guard([&] { fProperty.BeginInInstance(number, known); });
+    }
+    fContext.Guard([&] { Begin(action, known); });
+}
+
+/// Enters the state of an element that starts, and returns the action for it. The state is entered before the action runs, so an
+/// action sees its own element as the open one.
+TCimXmlTable::EAction TCimXmlReader::Enter(const char* name, TElement::EElement element)
+{
+    CheckBlank();
     const TTable::TStep step = TTable::Find(GetState(), element);
     if (step.action == TTable::kRefuse) {
         FailUnexpected(name);
     }
-    // The state is entered before the action runs, so an action sees its own element as the open one.
     fOpen.push_back({step.next, element});
     fText = std::string_view();
-    fContext.Guard([&] { Begin(step.action, TCimXmlAttributes(fContext, element, attributes)); });
+    return step.action;
 }
 
 void TCimXmlReader::OnEnd(const char*)
@@ -96,7 +111,8 @@ void TCimXmlReader::Begin(TTable::EAction action, const TCimXmlAttributes& attri
 {
     switch (action) {
     case TTable::kBeginProperty:
-        return BeginProperty(attributes);
+        fItem = &fProperty.GetItem();
+        return fIsDirect ? fProperty.BeginInInstance(attributes) : fProperty.BeginInDraft(attributes);
     case TTable::kBeginValue:
         return BeginValue();
     case TTable::kBeginArray:
@@ -159,7 +175,7 @@ void TCimXmlReader::End(TTable::EAction action)
     case TTable::kEndText:
         return EndText();
     case TTable::kEndProperty:
-        return EndProperty();
+        return fIsDirect ? fProperty.EndInInstance() : fProperty.EndInDraft();
     case TTable::kEndArray:
         return fItem->EndArray();
     case TTable::kEndInstance:
@@ -284,59 +300,10 @@ bool TCimXmlReader::KeepObject(TCimXmlDraft& draft)
     return true;
 }
 
-void TCimXmlReader::BeginProperty(const TCimXmlAttributes& attributes)
-{
-    const char* name = attributes.Require("NAME");
-    if (fIsDirect) {
-        fTarget = fLoader->FindProperty(name);
-    } else {
-        fDraft.BeginProperty(name, attributes);
-    }
-    const TType type = ReadPropertyType(attributes);
-    // In a draft, unmarked text stays text: its class is not known yet (see TCimXmlInstanceBuilder::Fill).
-    TCimXmlItem::EText text = TCimXmlItem::kPlain;
-    if (type.GetElementType() == TType::kString) {
-        if (IsMarkedEmbedded(attributes)) {
-            text = TCimXmlItem::kObject;
-        } else if (fIsDirect && fTarget.isEmbedded) {
-            text = TCimXmlItem::kPerhapsObject;
-        }
-    }
-    fProperty.Begin(fIsDirect ? *fTarget.name : fDraft.GetPropertyName(), type, text);
-    fItem = &fProperty;
-}
-
-/// The type that the element gives. If that is the declared one, as it mostly is, its name need not be looked up.
-TCIMValue::TCIMType TCimXmlReader::ReadPropertyType(const TCimXmlAttributes& attributes) const
-{
-    const TElement::EElement element = attributes.GetElement();
-    if (element == TElement::kPropertyReference) {
-        return TType::kReference;
-    }
-    if (element == TElement::kPropertyRefArray) {
-        return TType::kArrayReference;
-    }
-    const char* text = attributes.Require("TYPE");
-    const bool isDeclared = fIsDirect && std::strcmp(text, TValueText::GetTypeName(fTarget.type)) == 0;
-    const TType type = isDeclared ? fTarget.type.GetElementType() : attributes.ReadType(text);
-    return element == TElement::kPropertyArray ? type.GetArrayType() : type;
-}
-
-void TCimXmlReader::EndProperty()
-{
-    if (!fIsDirect) {
-        return fDraft.EndProperty(fProperty.Take());
-    }
-    // A new instance has nulls already, apart from what it shares with others.
-    if (!fProperty.IsNull() || fTarget.isStatic) {
-        fLoader->SetProperty(fTarget, fProperty.Take(), fPaths.TakeMetUnsettled());
-    }
-}
-
 void TCimXmlReader::EndQualifier()
 {
     TEmbeddedObject::TQualifier qualifier = fQualifier.Take();
-    fItem = &fProperty;
+    fItem = &fProperty.GetItem();
     if (fIsDirect) {
         // An instance has no qualifiers in the model, so there is nothing to keep.
         return fContext.Tolerate("qualifier of an instance",

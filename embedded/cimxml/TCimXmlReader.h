@@ -12,6 +12,7 @@
 #include "embedded/cimxml/TCimXmlLoader.h"
 #include "embedded/cimxml/TCimXmlObjectReader.h"
 #include "embedded/cimxml/TCimXmlPathReader.h"
+#include "embedded/cimxml/TCimXmlPropertyReader.h"
 #include "embedded/cimxml/TCimXmlQualifierReader.h"
 #include "embedded/cimxml/TCimXmlTable.h"
 
@@ -28,6 +29,7 @@ class TCimXmlReader : public IXmlSink {
     TCimXmlReader(TCimXmlContext& context, const boost::shared_ptr<const TInMemNamespace>& ns, TCimXmlLoader* loader);
 
     void OnStart(const char* name, const char** attributes) override;
+    void OnKnownStart(std::size_t number, const char* name, const char** attributes) override;
     void OnEnd(const char* name) override;
     void OnText(const char* text, std::size_t length) override { fText = std::string_view(text, length); }
 
@@ -43,7 +45,6 @@ class TCimXmlReader : public IXmlSink {
   private:
     using TTable = TCimXmlTable;
     using TElement = TCimXmlElement;
-    using TType = TCIMValue::TCIMType;
 
     struct TOpen {
         TTable::EState state;
@@ -55,6 +56,7 @@ class TCimXmlReader : public IXmlSink {
     TTable::EState GetState() const noexcept { return fOpen.back().state; }
     TTable::EState GetOuterState() const noexcept { return fOpen[fOpen.size() - 2].state; }
 
+    TTable::EAction Enter(const char* name, TElement::EElement element);
     void Begin(TTable::EAction action, const TCimXmlAttributes& attributes);
     void BeginRare(TTable::EAction action, const TCimXmlAttributes& attributes);
     void End(TTable::EAction action);
@@ -68,9 +70,6 @@ class TCimXmlReader : public IXmlSink {
     void BeginInstance(const TCimXmlAttributes& attributes);
     void EndInstance();
     bool KeepObject(TCimXmlDraft& draft);
-    void BeginProperty(const TCimXmlAttributes& attributes);
-    TType ReadPropertyType(const TCimXmlAttributes& attributes) const;
-    void EndProperty();
     void EndQualifier();
     void BeginValue();
     void EndText();
@@ -83,15 +82,15 @@ class TCimXmlReader : public IXmlSink {
     TCimXmlPathReader fPaths;
     TCimXmlObjectReader fObjects;
     TCimXmlDraftBuilder fDraft;
-    TCimXmlItem fProperty;
+    TCimXmlPropertyReader fProperty;
     TCimXmlQualifierReader fQualifier;
-    TCimXmlItem* fItem = &fProperty;  // what a value belongs to: the property, or the qualifier that is open
-    std::vector<TOpen> fOpen;         // the open elements, outermost first
-    std::string_view fText;           // between the last tag and this one
-    TCimXmlTarget fTarget{nullptr, 0, TType::kNone, false, false};
-    bool fIsDirect = false;       // the instance is filled without a draft
-    bool fIsObjectGiven = false;  // the VALUE.OBJECT that is open has had its class or instance
+    TCimXmlItem* fItem = &fProperty.GetItem();  // what a value belongs to: the property, or the qualifier that is open
+    std::vector<TOpen> fOpen;                   // the open elements, outermost first
+    std::string_view fText;                     // between the last tag and this one
+    bool fIsDirect = false;                     // the instance is filled without a draft
+    bool fIsObjectGiven = false;                // the VALUE.OBJECT that is open has had its class or instance
     boost::shared_ptr<const TEmbeddedObject> fObject;
+    std::vector<TElement::EElement> fKnown;  // the elements of known tags, by their numbers; kCount if it has not been looked up
 };
 
 }  // namespace NORVZEL20

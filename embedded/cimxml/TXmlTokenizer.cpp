@@ -270,8 +270,13 @@ void TXmlTokenizer::Start(TXmlKnownTags::TKnown& known)
     char* const end = fAt + tag.GetBytes().size();
     BeginEvent();
     fHasBegun = true;
-    fOpen.Push(tag.GetName(), tag.GetNameLength(), known.number < TXmlKnownTags::kMost);
-    fSink.OnStart(tag.GetName(), tag.GetAttributes());
+    const bool isKept = known.number < TXmlKnownTags::kMost;
+    fOpen.Push(tag.GetName(), tag.GetNameLength(), isKept);
+    if (isKept) {
+        fSink.OnKnownStart(known.number, tag.GetName(), tag.GetAttributes());
+    } else {
+        fSink.OnStart(tag.GetName(), tag.GetAttributes());
+    }
     fText.clear();
     if (tag.IsEmpty()) {
         fOpen.Pop();
