@@ -24,7 +24,7 @@ class TDuckDb : public IPeerDatabase {
         Check(duckdb_open(nullptr, &fDatabase), "cannot be opened");
         Check(duckdb_connect(fDatabase, &fConnection), "cannot be connected to");
         // A run of the comparison takes one thread, too.
-        Query("SET threads = 1", [](const std::vector<std::string_view>&) {});
+        Execute("SET threads = 1");
     }
     TDuckDb(const TDuckDb&) = delete;
     TDuckDb& operator=(const TDuckDb&) = delete;
@@ -41,7 +41,7 @@ class TDuckDb : public IPeerDatabase {
         for (std::size_t column = 0; column < columns; ++column) {
             names += (column == 0 ? "c" : ", c") + std::to_string(column) + " VARCHAR NOT NULL";
         }
-        Query("CREATE TABLE " + table + "(" + names + ")", [](const std::vector<std::string_view>&) {});
+        Execute("CREATE TABLE " + table + "(" + names + ")");
         duckdb_appender appender = nullptr;
         Check(duckdb_appender_create(fConnection, nullptr, table.c_str(), &appender), "cannot append");
         bool done = true;
@@ -59,13 +59,7 @@ class TDuckDb : public IPeerDatabase {
     void Query(const std::string& sql, const TVisitRow& visit) override
     {
         TDuckDbResult query;
-        if (duckdb_query(fConnection, sql.c_str(), &query.result) != DuckDBSuccess) {
-            throw std::runtime_error(std::string("DuckDB: ") + duckdb_result_error(&query.result));
-        }
-        // A statement that is no query has a result, too: a count, which is not text.
-        if (duckdb_result_return_type(query.result) != DUCKDB_RESULT_TYPE_QUERY_RESULT) {
-            return;
-        }
+        Ask(sql, query);
         const idx_t columns = duckdb_column_count(&query.result);
         while (duckdb_data_chunk chunk = duckdb_fetch_chunk(query.result)) {
             VisitRows(chunk, columns, visit);
@@ -74,6 +68,19 @@ class TDuckDb : public IPeerDatabase {
     }
 
   private:
+    void Ask(const std::string& sql, TDuckDbResult& answer)
+    {
+        if (duckdb_query(fConnection, sql.c_str(), &answer.result) != DuckDBSuccess) {
+            throw std::runtime_error(std::string("DuckDB: ") + duckdb_result_error(&answer.result));
+        }
+    }
+
+    void Execute(const std::string& sql)
+    {
+        TDuckDbResult unread;
+        Ask(sql, unread);
+    }
+
     static void VisitRows(duckdb_data_chunk chunk, idx_t columns, const TVisitRow& visit)
     {
         std::vector<duckdb_string_t*> texts;
