@@ -33,18 +33,24 @@ struct TCIMReference::TContents::TSpares {
     }
 };
 
-/// Frees the spares of its thread.
+/// Ends the keeping of spares with its thread.
 struct TCIMReference::TContents::TSparesEnd {
     TSpares& spares;
 
     ~TSparesEnd()
     {
         spares.isClosed = true;
-        while (spares.count > 0) {
-            delete spares.contents[--spares.count];
-        }
+        FreeSpares();
     }
 };
+
+void TCIMReference::TContents::FreeSpares() noexcept
+{
+    TSpares& spares = TSpares::OfThread();
+    while (spares.count > 0) {
+        delete spares.contents[--spares.count];
+    }
+}
 
 TCIMReference::TContents* TCIMReference::TContents::Make()
 {

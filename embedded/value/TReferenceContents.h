@@ -35,6 +35,8 @@ struct TCIMReference::TContents : TCounted {
     static TContents* Make();
     /// Gives up one use.
     static void Drop(TContents* contents) noexcept;
+    /// Frees what this thread keeps of paths that have ended.
+    static void FreeSpares() noexcept;
 
     TPlace& OwnPlace()
     {

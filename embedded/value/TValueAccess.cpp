@@ -130,6 +130,11 @@ void TValueAccess::LimitDepth(TCIMValue& key, unsigned int above)
     }
 }
 
+void TValueAccess::FreeSparePaths() noexcept
+{
+    TCIMReference::TContents::FreeSpares();
+}
+
 // TCounted is not polymorphic: the form says which block it is.
 void TValueAccess::DropBlock(const TCIMValue& value) noexcept
 {

@@ -67,6 +67,10 @@ class CIMDELTA_INTERNAL_EXPORT TValueAccess {
     /// paths the path may be in itself.
     static void LimitDepth(TCIMValue& key, unsigned int above);
 
+    /// Frees the memory of paths that have ended, which the calling thread keeps for its next ones: for a caller that accounts for
+    /// each block.
+    static void FreeSparePaths() noexcept;
+
   private:
     friend class TCIMValue;
 

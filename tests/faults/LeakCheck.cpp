@@ -4,6 +4,7 @@
 
 #include <filesystem>
 
+#include "embedded/value/TValueAccess.h"
 #include "tests/faults/TFailingAllocator.h"
 
 namespace NORVZEL20 {
@@ -11,8 +12,10 @@ namespace NORVZEL20 {
 void ExpectNothingLeft(const std::function<void()>& call)
 {
     const std::ptrdiff_t files = CountOpenFiles();
+    TValueAccess::FreeSparePaths();
     const TFailingAllocator::TUsage before = TFailingAllocator::GetLive();
     call();
+    TValueAccess::FreeSparePaths();
     const TFailingAllocator::TUsage after = TFailingAllocator::GetLive();
     EXPECT_EQ(before.blocks, after.blocks);
     EXPECT_EQ(before.bytes, after.bytes);
