@@ -57,7 +57,10 @@ bool TInMemGroup::HasRoom() const noexcept
 
 TInMemInstance& TInMemGroup::Make() noexcept
 {
-    TInMemInstance& instance = *new (&GetInstance(fCount)) TInMemInstance(fClass->GetLayout(), fSlots, fCount);
+    static_assert(kMostInstances * TInMemInstance::GetSize(TInMemProperty::kMostBehindInstance) <= 0xffff,
+                  "offsets take two bytes");
+    const auto offset = static_cast<std::uint16_t>(fCount * TInMemInstance::GetSize(fSlots));
+    TInMemInstance& instance = *new (&GetInstance(fCount)) TInMemInstance(fClass->GetLayout(), fSlots, offset);
     ++fCount;
     return instance;
 }
@@ -65,13 +68,6 @@ TInMemInstance& TInMemGroup::Make() noexcept
 TInMemInstance& TInMemGroup::GetInstance(std::uint32_t position) noexcept
 {
     return *reinterpret_cast<TInMemInstance*>(reinterpret_cast<char*>(this + 1) + position * TInMemInstance::GetSize(fSlots));
-}
-
-TInMemGroup& TInMemGroup::GetGroup(const TInMemInstance& instance, std::uint32_t position) noexcept
-{
-    // Operations that are const give out handles through which properties are changed.
-    char* const place = reinterpret_cast<char*>(const_cast<TInMemInstance*>(&instance));
-    return *(reinterpret_cast<TInMemGroup*>(place - position * instance.GetSize()) - 1);
 }
 
 }  // namespace NORVZEL20

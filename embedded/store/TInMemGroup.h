@@ -32,8 +32,6 @@ class TInMemGroup : public boost::enable_shared_from_this<TInMemGroup> {
     bool HasRoom() const noexcept;
     /// Makes an instance with every property null. There must be room.
     TInMemInstance& Make() noexcept;
-    /// The group of the instance that is at `position`.
-    static TInMemGroup& GetGroup(const TInMemInstance& instance, std::uint32_t position) noexcept;
 
   private:
     TInMemGroup(boost::shared_ptr<TInMemClass> cls, std::uint32_t slots, std::uint32_t count) noexcept;

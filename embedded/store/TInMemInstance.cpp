@@ -47,8 +47,8 @@ TInMemProperty* TInMemInstance::GetOwnProperties() const noexcept
     return reinterpret_cast<TInMemProperty*>(const_cast<TInMemInstance*>(this) + 1);
 }
 
-TInMemInstance::TInMemInstance(const TInMemLayout& layout, std::uint8_t slots, std::uint8_t position) noexcept
-    : fSlots(slots), fPosition(position)
+TInMemInstance::TInMemInstance(const TInMemLayout& layout, std::uint8_t slots, std::uint16_t offset) noexcept
+    : fOffset(offset), fSlots(slots)
 {
     for (std::uint32_t slot = 0; slot < slots; ++slot) {
         TInMemProperty::MakeBehindInstance(GetOwnProperties() + slot, slot, layout.GetDecl(slot).GetType());
@@ -62,19 +62,21 @@ TInMemInstance::~TInMemInstance()
     }
 }
 
+TInMemGroup& TInMemInstance::GetGroup() const noexcept
+{
+    // Operations that are const give out handles through which properties are changed.
+    char* const place = reinterpret_cast<char*>(const_cast<TInMemInstance*>(this));
+    return *(reinterpret_cast<TInMemGroup*>(place - fOffset) - 1);
+}
+
 const boost::shared_ptr<TInMemClass>& TInMemInstance::GetInMemClass() const noexcept
 {
-    return TInMemGroup::GetGroup(*this, fPosition).GetClass();
+    return GetGroup().GetClass();
 }
 
 const TInMemLayout& TInMemInstance::GetLayout() const noexcept
 {
     return GetInMemClass()->GetLayout();
-}
-
-boost::shared_ptr<const TInMemInstance> TInMemInstance::GetSelf() const
-{
-    return boost::shared_ptr<const TInMemInstance>(TInMemGroup::GetGroup(*this, fPosition).shared_from_this(), this);
 }
 
 void TInMemInstance::Validate(TCallContext) const
@@ -84,7 +86,7 @@ void TInMemInstance::Validate(TCallContext) const
 
 void TInMemInstance::AddToNamespace(TCallContext)
 {
-    GetInMemClass()->GetExtent().Add(boost::const_pointer_cast<TInMemInstance>(GetSelf()));
+    GetInMemClass()->GetExtent().Add(boost::shared_ptr<TInMemInstance>(GetGroup().shared_from_this(), this));
 }
 
 TCIMReference TInMemInstance::GetReference() const
@@ -114,32 +116,36 @@ boost::shared_ptr<ICIMClass> TInMemInstance::GetClass(TCallContext) const
 }
 
 /// A static property lives in its declaration, any other one in the instance; the handle keeps that object alive.
-boost::shared_ptr<ICIMProperty> TInMemInstance::GetHandle(std::uint32_t slot, boost::shared_ptr<const TInMemInstance> self) const
+boost::shared_ptr<ICIMProperty> TInMemInstance::GetHandle(const TInMemLayout& layout, std::uint32_t slot,
+                                                          boost::shared_ptr<TInMemGroup> group) const
 {
-    const auto& decl = GetLayout().GetSharedDecl(slot);
+    const auto& decl = layout.GetSharedDecl(slot);
     if (decl->IsStatic()) {
         return boost::shared_ptr<ICIMProperty>(decl, &decl->GetStaticProperty());
     }
-    return boost::shared_ptr<ICIMProperty>(std::move(self), &GetSlotProperty(slot));
+    return boost::shared_ptr<ICIMProperty>(std::move(group), &GetSlotProperty(slot));
 }
 
 boost::shared_ptr<ICIMProperty> TInMemInstance::GetProperty(const std::string& name, TCallContext) const
 {
-    const std::uint32_t slot = GetLayout().FindSlot(name);
+    TInMemGroup& group = GetGroup();
+    const TInMemLayout& layout = group.GetClass()->GetLayout();
+    const std::uint32_t slot = layout.FindSlot(name);
     if (slot == TInMemLayout::kNoSlot) {
         throw TStoreRefusal(TZELStatusCode::kNotFound,
                             [&] { return "property " + name + " of instance " + TStoreRefusal::Shown(GetReference()); });
     }
-    return GetHandle(slot, GetSelf());
+    return GetHandle(layout, slot, group.shared_from_this());
 }
 
 void TInMemInstance::EnumerateProperties(const boost::function<bool(boost::shared_ptr<ICIMProperty>)>& callback, TCallContext) const
 {
-    const boost::shared_ptr<const TInMemInstance> self = GetSelf();
-    const std::vector<std::uint32_t>& order = GetLayout().GetOrder();
+    const boost::shared_ptr<TInMemGroup> group = GetGroup().shared_from_this();
+    const TInMemLayout& layout = GetLayout();
+    const std::vector<std::uint32_t>& order = layout.GetOrder();
     // The loop goes by position, because the callback may add properties to the class.
     for (std::size_t at = 0; at < order.size(); ++at) {
-        if (!callback(GetHandle(order[at], self))) {
+        if (!callback(GetHandle(layout, order[at], group))) {
             return;
         }
     }

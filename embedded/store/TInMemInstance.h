@@ -74,8 +74,7 @@ class CIMDELTA_EXPORT TInMemInstance final : public ICIMInstance {
     bool IsMarkedRemoved(std::uint32_t slot) const noexcept;
 
     /// The bytes that an instance takes together with `slots` properties behind it.
-    static std::size_t GetSize(std::uint32_t slots) noexcept { return sizeof(TInMemInstance) + slots * sizeof(TInMemProperty); }
-    std::size_t GetSize() const noexcept { return GetSize(fSlots); }
+    static constexpr std::size_t GetSize(std::uint32_t slots) noexcept;
     /// The instance that the row of properties beginning with `first` stands behind.
     static TInMemInstance& GetOwner(const TInMemProperty& first) noexcept
     {
@@ -89,11 +88,12 @@ class CIMDELTA_EXPORT TInMemInstance final : public ICIMInstance {
 
     struct TExtras;  // what few instances have
 
-    TInMemInstance(const TInMemLayout& layout, std::uint8_t slots, std::uint8_t position) noexcept;
-    boost::shared_ptr<const TInMemInstance> GetSelf() const;
+    TInMemInstance(const TInMemLayout& layout, std::uint8_t slots, std::uint16_t offset) noexcept;
+    TInMemGroup& GetGroup() const noexcept;
     const TInMemLayout& GetLayout() const noexcept;
     TInMemProperty* GetOwnProperties() const noexcept;
-    boost::shared_ptr<ICIMProperty> GetHandle(std::uint32_t slot, boost::shared_ptr<const TInMemInstance> self) const;
+    boost::shared_ptr<ICIMProperty> GetHandle(const TInMemLayout& layout, std::uint32_t slot,
+                                              boost::shared_ptr<TInMemGroup> group) const;
     TExtras& GetExtras() const;
     TInMemProperty& GetLateProperty(std::uint32_t slot) const;
     void SetAdded(std::uint32_t keyHash) noexcept;
@@ -101,10 +101,15 @@ class CIMDELTA_EXPORT TInMemInstance final : public ICIMInstance {
 
     mutable std::unique_ptr<TExtras> fExtras;
     std::uint32_t fKeyHash = 0;
-    std::uint8_t fSlots;     // whose properties stand behind the instance
-    std::uint8_t fPosition;  // in its group
+    std::uint16_t fOffset;  // in bytes, from the first instance of its group
+    std::uint8_t fSlots;    // whose properties stand behind the instance
     bool fAdded = false;
 };
+
+constexpr std::size_t TInMemInstance::GetSize(std::uint32_t slots) noexcept
+{
+    return sizeof(TInMemInstance) + slots * sizeof(TInMemProperty);
+}
 
 static_assert(sizeof(TInMemInstance) == 24, "what all instances of a group share is kept in the group");
 
