@@ -19,7 +19,7 @@ std::ostream& operator<<(std::ostream& out, EAgain again)
                                              "NewObjects"}[static_cast<std::size_t>(again)];
 }
 
-// A class that counts how often it is asked for its name. Each path text does so equally often.
+// A class that counts how often it is asked for its name. Each text of a path with the same keys does so equally often.
 class TNamedClass : public TWatchedClass {
   public:
     TNamedClass(boost::shared_ptr<ICIMClass> cls, boost::shared_ptr<TCallWatch> watch, std::size_t& names)
@@ -132,6 +132,8 @@ class SecondEnumerationTest : public testing::TestWithParam<EAgain> {
             TCIMReference path;
             path.SetClass(
                 boost::make_shared<TNamedClass>(Namespace(1).GetNamespace()->GetClass("Disk", TCallContext()), fWatch, fNames));
+            path.AddKeyValue("Bus", 0u);
+            path.AddKeyValue("Id", "sda");
             path.GetPath();
             return names / (fNames - names);
         }
