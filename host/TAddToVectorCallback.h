@@ -1,6 +1,7 @@
 #pragma once
 
 #include <boost/smart_ptr/shared_ptr.hpp>
+#include <utility>
 #include <vector>
 
 #include "host/TUnaryFunction.h"
@@ -18,7 +19,7 @@ class TAddToVectorCallback : public TUnaryFunction<boost::shared_ptr<T>> {
     /// Always returns true, so the enumeration continues.
     bool operator()(boost::shared_ptr<T> element) const
     {
-        fElements->push_back(element);
+        fElements->push_back(std::move(element));
         return true;
     }
 
