@@ -57,6 +57,11 @@ std::size_t TMemoryMeter::GetPeak() const
     return static_cast<std::size_t>(peak - fInUseAtStart);
 }
 
+std::ptrdiff_t TMemoryMeter::GetInUse() const
+{
+    return inUse - fInUseAtStart;
+}
+
 std::size_t TMemoryMeter::GetTotal() const
 {
     return total - fTotalAtStart;

@@ -14,6 +14,8 @@ class TMemoryMeter {
 
     /// The most bytes that were in use at a time, beyond those at the start.
     std::size_t GetPeak() const;
+    /// The bytes that are in use now, beyond those at the start; negative if memory from before the start was freed.
+    std::ptrdiff_t GetInUse() const;
     /// All bytes that were allocated, freed ones included.
     std::size_t GetTotal() const;
 
