@@ -94,12 +94,8 @@ void TCimXmlReader::OnEnd(const char*)
     fText = std::string_view();
 }
 
-/// If only elements may stand here, the text must be white space.
-void TCimXmlReader::CheckBlank() const
+void TCimXmlReader::RequireBlank() const
 {
-    if (fText.empty() || TTable::TakesText(GetState())) {
-        return;
-    }
     if (!std::all_of(fText.begin(), fText.end(), TXmlCharacter::IsBlank)) {
         fContext.Fail(EStatus::kParseError, "found text " + Quote(fText) + " in <" + TElement::GetName(fOpen.back().element) +
                                                 ">, expected only elements");

@@ -52,7 +52,14 @@ class TCimXmlReader : public IXmlSink {
     };
 
     [[noreturn]] void FailUnexpected(const char* name) const;
-    void CheckBlank() const;
+    /// If only elements may stand here, the text must be white space.
+    void CheckBlank() const
+    {
+        if (!fText.empty() && !TTable::TakesText(GetState())) {
+            RequireBlank();
+        }
+    }
+    void RequireBlank() const;
     TTable::EState GetState() const noexcept { return fOpen.back().state; }
     TTable::EState GetOuterState() const noexcept { return fOpen[fOpen.size() - 2].state; }
 

@@ -14,6 +14,7 @@
 // '<'.
 #include "embedded/cimxml/TXmlTokenizer.h"
 
+#include <cstring>
 #include <string_view>
 #include <utility>
 
@@ -292,11 +293,10 @@ EXmlScan TXmlTokenizer::ScanEndTag()
 {
     constexpr std::size_t kBegin = 2;  // "</"
     const std::string_view name = fOpen.GetName();
-    const std::string_view rest(fAt, static_cast<std::size_t>(fWindow.GetEnd() - fAt));
-    if (rest.size() <= kBegin + name.size()) {
+    if (static_cast<std::size_t>(fWindow.GetEnd() - fAt) <= kBegin + name.size()) {
         return EXmlScan::kCutOff;
     }
-    if (rest.substr(kBegin, name.size()) != name) {
+    if (std::memcmp(fAt + kBegin, name.data(), name.size()) != 0) {
         return EXmlScan::kRefused;
     }
     char* close = fAt + kBegin + name.size();
