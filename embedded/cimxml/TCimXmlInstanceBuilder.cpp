@@ -72,10 +72,27 @@ TCimXmlTarget TCimXmlInstanceBuilder::FindProperty(const char* name)
     if (!TakeSlot(slot)) {
         fContext.Fail(EStatus::kParseError, DescribeSecondProperty(name, "instance"));
     }
-    const TInMemPropertyDecl& decl = cls.GetLayout().GetDecl(slot);
+    return MakeTarget(slot);
+}
+
+bool TCimXmlInstanceBuilder::TakeLikely(std::size_t tagNumber, TCimXmlTarget& target) noexcept
+{
+    const std::vector<std::uint32_t>& order = fLayout->cls->GetLayout().GetOrder();
+    if (fExpected >= order.size() || fLayout->tags[order[fExpected]].number != tagNumber) {
+        return false;
+    }
+    const std::uint32_t slot = order[fExpected];
+    target = MakeTarget(slot);
+    return TakeSlot(slot);
+}
+
+TCimXmlTarget TCimXmlInstanceBuilder::MakeTarget(std::uint32_t slot) const noexcept
+{
+    const TInMemPropertyDecl& decl = fLayout->cls->GetLayout().GetDecl(slot);
     return {&decl.GetName(), slot, decl.GetType(), fLayout->embedded[slot], decl.IsStatic()};
 }
 
+/// Notes that the instance has the property; false if it has had it.
 bool TCimXmlInstanceBuilder::TakeSlot(std::uint32_t slot) noexcept
 {
     if (fLayout->given[slot] == fNumber) {

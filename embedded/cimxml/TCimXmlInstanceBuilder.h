@@ -37,11 +37,11 @@ class TCimXmlInstanceBuilder {
     bool Begin(const char* className);
     /// Errors: kNotFound (15) if the class has no such property, kParseError (9) if the instance has had it already.
     TCimXmlTarget FindProperty(const char* name);
-    /// What identifies the class of the instance being filled, while the builder lives.
-    const TCimXmlLayout* GetLayout() const noexcept { return fLayout; }
-    /// As FindProperty, for a slot that it has found before in an instance of the same class. Returns false if the instance has had
-    /// the property already.
-    bool TakeSlot(std::uint32_t slot) noexcept;
+    /// As FindProperty, for the property that is likely to come next. Returns false if the tag with that number is not the last one
+    /// that was noted for it, or the instance has had the property already.
+    bool TakeLikely(std::size_t tagNumber, TCimXmlTarget& target) noexcept;
+    /// What is noted of the tag of a property, in instances of the same class.
+    TCimXmlLayout::TTag& GetTag(const TCimXmlTarget& target) noexcept { return fLayout->tags[target.slot]; }
     /// `isUnsettled` says that references in the value may have to be written again (see TCimXmlPathReader::TakeMetUnsettled). A
     /// value of another type is converted. Errors: kTypeMismatch (13) if that would lose something; kParseError (9) if the property
     /// is static and another instance has given it another value.
@@ -56,6 +56,8 @@ class TCimXmlInstanceBuilder {
     bool IsHeld() const noexcept { return fLayout->isHeld; }
 
   private:
+    bool TakeSlot(std::uint32_t slot) noexcept;
+    TCimXmlTarget MakeTarget(std::uint32_t slot) const noexcept;
     TCimXmlLayout* FindLayout(const char* className);
     void SetStatic(const TCimXmlTarget& target, const TCIMValue& value);
     TCIMValue Convert(const TCimXmlTarget& target, const TCIMValue& value);

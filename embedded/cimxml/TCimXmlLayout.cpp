@@ -5,7 +5,8 @@
 namespace NORVZEL20 {
 
 TCimXmlLayout::TCimXmlLayout(boost::shared_ptr<TInMemClass> ofClass)
-    : cls(std::move(ofClass)), positions(cls->GetLayout().GetSlotCount()), given(cls->GetLayout().GetSlotCount())
+    : cls(std::move(ofClass)), positions(cls->GetLayout().GetSlotCount()), given(cls->GetLayout().GetSlotCount()),
+      tags(cls->GetLayout().GetSlotCount())
 {
     for (std::uint32_t slot = 0; slot < cls->GetLayout().GetSlotCount(); ++slot) {
         embedded.push_back(cls->GetLayout().GetDecl(slot).HoldsObjects());

@@ -37,11 +37,11 @@ class CIMDELTA_INTERNAL_EXPORT TCimXmlLoader {
     void AddClass(TCimXmlDraft draft);
 
     /// Starts an instance. If it returns false, read the instance as a draft and call AddInstance; otherwise call FindProperty or
-    /// TakeSlot, and SetProperty, for each of its properties (see TCimXmlInstanceBuilder), then EndInstance.
+    /// TakeLikely, and SetProperty, for each of its properties (see TCimXmlInstanceBuilder), then EndInstance.
     bool BeginInstance(const char* className);
     TCimXmlTarget FindProperty(const char* name) { return fBuilder.FindProperty(name); }
-    const TCimXmlLayout* GetLayout() const noexcept { return fBuilder.GetLayout(); }
-    bool TakeSlot(std::uint32_t slot) noexcept { return fBuilder.TakeSlot(slot); }
+    bool TakeLikely(std::size_t tagNumber, TCimXmlTarget& target) noexcept { return fBuilder.TakeLikely(tagNumber, target); }
+    TCimXmlLayout::TTag& GetTag(const TCimXmlTarget& target) noexcept { return fBuilder.GetTag(target); }
     void SetProperty(const TCimXmlTarget& target, TCIMValue&& value, bool isUnsettled)
     {
         fBuilder.SetProperty(target, std::move(value), isUnsettled);

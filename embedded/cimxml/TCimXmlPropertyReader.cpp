@@ -1,9 +1,9 @@
 // Properties of instances are what a document mostly consists of.
 //
 // An instance whose class is declared is filled without a draft: a property goes straight to its slot, and its declared type spares
-// looking up the name of its type. The start tags are few and come again and again. So what a tag means (slot, type, whether text
-// may be an embedded object) is found once for each class in a row that has such a property. A tag that stands in instances of two
-// classes in turn, as one for an inherited property does, is looked up anew.
+// looking up the name of its type. The start tags are few and come again and again. So it is noted for each property of a class
+// which tag it had last, and what that tag means (type, whether text may be an embedded object). If the tag of the property that is
+// likely to come next is the one noted, nothing is looked up and no name compared.
 #include "embedded/cimxml/TCimXmlPropertyReader.h"
 
 #include <cstring>
@@ -39,17 +39,13 @@ void TCimXmlPropertyReader::BeginInInstance(const TCimXmlAttributes& attributes)
 
 void TCimXmlPropertyReader::BeginInInstance(std::size_t number, const TCimXmlAttributes& attributes)
 {
-    if (number >= fKnown.size()) {
-        fKnown.resize(number + 1);
-    }
-    TKnown& known = fKnown[number];
-    if (known.layout == fLoader->GetLayout() && fLoader->TakeSlot(known.target.slot)) {
-        fTarget = known.target;
-        fItem.Begin(*fTarget.name, known.type, known.text);
+    if (fLoader->TakeLikely(number, fTarget)) {
+        const TCimXmlLayout::TTag& tag = fLoader->GetTag(fTarget);
+        fItem.Begin(*fTarget.name, tag.type, tag.text);
         return;
     }
     BeginInInstance(attributes);
-    known = {fLoader->GetLayout(), fTarget, fItem.GetType(), fItem.GetText()};
+    fLoader->GetTag(fTarget) = {number, fItem.GetType(), fItem.GetText()};
 }
 
 /// A new instance has nulls already, apart from what it shares with others.

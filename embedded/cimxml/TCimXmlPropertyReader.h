@@ -2,7 +2,6 @@
 
 #include <cstddef>
 #include <string>
-#include <vector>
 
 #include "embedded/cimxml/TCimXmlAttributes.h"
 #include "embedded/cimxml/TCimXmlContext.h"
@@ -42,14 +41,6 @@ class TCimXmlPropertyReader {
   private:
     using TType = TCIMValue::TCIMType;
 
-    /// What a tag means in instances of one class.
-    struct TKnown {
-        const TCimXmlLayout* layout = nullptr;  // of that class; null if nothing is known
-        TCimXmlTarget target{nullptr, 0, TType::kNone, false, false};
-        TType type = TType::kNone;
-        TCimXmlItem::EText text = TCimXmlItem::kPlain;
-    };
-
     static TCimXmlItem::EText GetText(const TCimXmlAttributes& attributes, TType type, bool isDeclaredEmbedded);
     static TType ReadType(const TCimXmlAttributes& attributes, TType declared);
 
@@ -59,7 +50,6 @@ class TCimXmlPropertyReader {
     TCimXmlDraftBuilder& fDraft;
     TCimXmlItem fItem;
     TCimXmlTarget fTarget{nullptr, 0, TType::kNone, false, false};  // of the property of an instance
-    std::vector<TKnown> fKnown;                                     // by the number of the tag
 };
 
 }  // namespace NORVZEL20
