@@ -68,7 +68,9 @@ TCIMReference::TCIMReference(TContents* contents) noexcept : fContents(contents)
 
 TCIMReference::TCIMReference(boost::shared_ptr<ICIMNamespace> ns, std::map<std::string, TCIMValue> keys) : fContents(nullptr)
 {
-    TCIMReference path(TContents::Make());  // frees the contents if something below throws
+    // A path without a namespace is usually made for its text and ends soon. Any other may be stored, and recycled contents could
+    // take more memory than it needs. In either case, the path frees the contents if something below throws.
+    TCIMReference path(ns ? new TContents : TContents::Make());
     if (ns) {
         TContents::TPlace& place = path.fContents->OwnPlace();
         place.ns = ns;
@@ -109,7 +111,7 @@ TCIMReference::~TCIMReference()
 TCIMReference::TContents& TCIMReference::Own()
 {
     if (fContents == nullptr) {
-        fContents = TContents::Make();
+        fContents = new TContents;
     } else if (!fContents->IsUnique()) {
         // The swap gives up the use of the shared contents after the copy has succeeded.
         TCIMReference copy(new TContents(*fContents));

@@ -1,5 +1,5 @@
-// Paths come and go with every look-up of an instance, so each thread keeps the contents of the last few paths that ended, with the
-// memory of their bindings.
+// Paths that are made for their text come and go with every look-up of an instance, so each thread keeps the contents of the last
+// few paths that ended, with the memory of their bindings.
 //
 // The list of spares needs no destructor, so paths may end at any moment of a thread, also after its other thread-local objects.
 // A separate object frees the spares when the thread ends; from then on none are kept.

@@ -5,21 +5,24 @@
 #include <filesystem>
 
 #include "embedded/value/TValueAccess.h"
-#include "tests/faults/TFailingAllocator.h"
 
 namespace NORVZEL20 {
 
 void ExpectNothingLeft(const std::function<void()>& call)
 {
     const std::ptrdiff_t files = CountOpenFiles();
-    TValueAccess::FreeSparePaths();
-    const TFailingAllocator::TUsage before = TFailingAllocator::GetLive();
+    const TFailingAllocator::TUsage before = GetLiveWithoutSpares();
     call();
-    TValueAccess::FreeSparePaths();
-    const TFailingAllocator::TUsage after = TFailingAllocator::GetLive();
+    const TFailingAllocator::TUsage after = GetLiveWithoutSpares();
     EXPECT_EQ(before.blocks, after.blocks);
     EXPECT_EQ(before.bytes, after.bytes);
     EXPECT_EQ(files, CountOpenFiles());
+}
+
+TFailingAllocator::TUsage GetLiveWithoutSpares()
+{
+    TValueAccess::FreeSparePaths();
+    return TFailingAllocator::GetLive();
 }
 
 std::ptrdiff_t CountOpenFiles()

@@ -3,7 +3,7 @@
 #include <boost/smart_ptr/weak_ptr.hpp>
 #include <iostream>
 
-#include "tests/faults/TFailingAllocator.h"
+#include "tests/faults/LeakCheck.h"
 #include "tests/longrun/TSmallComparison.h"
 #include "tests/support/TTestAccess.h"
 
@@ -27,9 +27,9 @@ class TRetainedWrappersFixture : public testing::Test {
     /// As RunAndLetGo. Returns by how many bytes the memory in use has grown.
     std::size_t MeasureRetained(TWeak& delta) const
     {
-        const std::size_t before = TFailingAllocator::GetLive().bytes;
+        const std::size_t before = GetLiveWithoutSpares().bytes;
         delta = RunAndLetGo();
-        return TFailingAllocator::GetLive().bytes - before;
+        return GetLiveWithoutSpares().bytes - before;
     }
 
     static void BreakTheCycle(const TWeak& delta) { TTestAccess::ForgetWrappers(*delta.lock()); }
@@ -53,20 +53,20 @@ TEST_F(RetainedWrappers, KeepTheirDeltaNamespaceAndOneForEachClassAndNamespace)
 TEST_F(RetainedWrappers, RetainTheSameAmountWithEachDeltaNamespace)
 {
     BreakTheCycle(RunAndLetGo());
-    const std::size_t before = TFailingAllocator::GetLive().bytes;
+    const std::size_t before = GetLiveWithoutSpares().bytes;
     std::vector<TWeak> deltas(10);
-    const std::size_t whole = TFailingAllocator::GetLive().bytes;
+    const std::size_t whole = GetLiveWithoutSpares().bytes;
     const std::size_t retained = MeasureRetained(deltas[0]);
     EXPECT_GT(retained, 0u);
     for (std::size_t index = 1; index < deltas.size(); ++index) {
         EXPECT_EQ(retained, MeasureRetained(deltas[index]));
     }
-    EXPECT_EQ(whole + deltas.size() * retained, TFailingAllocator::GetLive().bytes);
+    EXPECT_EQ(whole + deltas.size() * retained, GetLiveWithoutSpares().bytes);
     for (const TWeak& delta : deltas) {
         BreakTheCycle(delta);
     }
     deltas = std::vector<TWeak>();
-    EXPECT_EQ(before, TFailingAllocator::GetLive().bytes);
+    EXPECT_EQ(before, GetLiveWithoutSpares().bytes);
     std::cout << "rules that exclude keys: " << retained << " bytes stay with each delta namespace\n";
     RecordProperty("BytesRetained", std::to_string(retained));
 }
