@@ -3,6 +3,7 @@
 #include <algorithm>
 #include <set>
 
+#include "host/TZELException.h"
 #include "tests/embedded/cimxml/TLoading.h"
 
 namespace NORVZEL20 {
