@@ -6,11 +6,11 @@
 #include <benchmark/benchmark.h>
 #include <expat.h>
 #include <libxml/parser.h>
-#include <malloc.h>
 
 #include <cstring>
 
 #include "bench/BenchmarkFiles.h"
+#include "bench/HeapBytes.h"
 #include "embedded/cimxml/TCimXmlPopulator.h"
 #include "embedded/store/TInMemNamespace.h"
 
@@ -22,12 +22,6 @@ void SetRates(benchmark::State& state, const std::string& xml)
     state.SetBytesProcessed(static_cast<std::int64_t>(state.iterations() * xml.size()));
     state.counters["per_instance"] = benchmark::Counter(static_cast<double>(state.iterations()) * kBenchInstances,
                                                         benchmark::Counter::kIsRate | benchmark::Counter::kInvert);
-}
-
-std::size_t HeapInUse()
-{
-    const struct mallinfo2 heap = mallinfo2();
-    return heap.uordblks + heap.hblkhd;
 }
 
 void BM_ExpatEmptyHandlers(benchmark::State& state)
@@ -71,11 +65,11 @@ void BM_LoadInventory(benchmark::State& state)
     const std::string& xml = FirstState();
     double bytes = 0;
     for (auto _ : state) {
-        const std::size_t before = HeapInUse();
+        const std::size_t before = HeapBytes();
         boost::shared_ptr<TInMemNamespace> ns = TInMemNamespace::Create("root/cimv2");
         TCimXmlPopulator(ns).LoadFromMemory(xml.data(), xml.size(), "bench.xml");
         state.PauseTiming();
-        bytes = static_cast<double>(HeapInUse() - before);
+        bytes = static_cast<double>(HeapBytes() - before);
         ns.reset();
         state.ResumeTiming();
     }

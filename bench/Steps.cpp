@@ -4,7 +4,6 @@
 // heap can be attributed to a step. Without rules nothing is compared, and the peak memory of the process is that of the
 // inventories.
 
-#include <malloc.h>
 #include <unistd.h>
 
 #include <CLI/CLI.hpp>
@@ -15,6 +14,7 @@
 #include <string>
 #include <vector>
 
+#include "bench/HeapBytes.h"
 #include "bench/OperatingSystem.h"
 #include "bench/TStopwatch.h"
 #include "embedded/cimxml/TCimXmlPopulator.h"
@@ -27,12 +27,6 @@ namespace NORVZEL20 {
 namespace {
 
 using TInventories = std::vector<boost::shared_ptr<TInMemNamespace>>;
-
-std::size_t HeapBytes()
-{
-    const struct mallinfo2 heap = mallinfo2();
-    return heap.uordblks + heap.hblkhd;
-}
 
 TInventories LoadAll(const std::vector<std::string>& files)
 {

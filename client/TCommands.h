@@ -2,8 +2,6 @@
 
 #include <CLI/CLI.hpp>
 #include <functional>
-#include <string>
-#include <vector>
 
 #include "client/commands/CheckCommand.h"
 #include "client/commands/CompareCommand.h"

@@ -2,7 +2,7 @@
 
 #include <utility>
 
-#include "engine/TMasterInstance.h"
+#include "engine/TInstanceWalk.h"
 #include "spec/TDiffClassRules.h"
 
 namespace NORVZEL20 {
@@ -23,15 +23,10 @@ std::string TCIMDiffEngine::TCompareInstances::BuildKey(const boost::shared_ptr<
 
 bool TCIMDiffEngine::TCompareInstances::operator()(boost::shared_ptr<ICIMInstance> instance)
 {
-    std::string key = BuildKey(instance);
-    const auto master = fMasterMap->find(key);
-    if (master != fMasterMap->end()) {
-        Match(master->second, std::move(key), std::move(instance));
-        return true;
-    }
-    const auto missing = fMissingMap->try_emplace(std::move(key)).first;
-    NoteMissing(missing->first, missing->second, *instance);
-    return true;
+    // A walk of one step: it has no place from before.
+    TInstanceWalk::TState state{TMapCursor<std::map<std::string, TMasterInstance>>(*fMasterMap),
+                                TMapCursor<std::map<std::string, std::vector<int>>>(*fMissingMap), nullptr};
+    return TInstanceWalk(*this, &state)(std::move(instance));
 }
 
 void TCIMDiffEngine::TCompareInstances::Match(TMasterInstance& master, std::string key, boost::shared_ptr<ICIMInstance> instance)

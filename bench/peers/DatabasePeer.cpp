@@ -32,7 +32,7 @@ std::string Columns(const std::string& table, std::size_t columns)
     return list;
 }
 
-// `x.c0<op>y.c0`, one for each column from `first` up to `last`, joined by the word.
+// `t0.c0<comparison>other.c0`, one for each column from `first` up to `last`, joined by the word.
 std::string Conditions(const std::string& other, const char* comparison, const char* word, std::size_t first, std::size_t last)
 {
     std::string list;

@@ -19,8 +19,8 @@ struct TFlatRow {
 
 /// An inventory as tables of text, one for each class: what a program would make of it that needs nothing but a comparison.
 ///
-/// It understands what the generator writes: classes in front of their instances, no superclasses, no arrays. It tells a value that
-/// is null from an empty one no more than a table of text does.
+/// It understands what the generator writes: classes in front of their instances, no superclasses, no arrays. A null and an
+/// empty text are the same to it.
 class TFlatInventory {
   public:
     /// Reads the file with Expat, in pieces. Throws std::runtime_error if it cannot be read, is not well-formed, or has an instance

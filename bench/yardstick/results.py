@@ -52,7 +52,7 @@ class Results:
             yield ""
             yield f"## {run['date']}: {run['label']}"
             yield ""
-            yield f"Commit {run['commit']}, {run['rounds']} rounds, {run['sizes']['instances']:,} instances."
+            yield f"Commit {run['commit']}, {run['rounds']} round{'s' if run['rounds'] != 1 else ''}, {run['sizes']['instances']:,} instances."
             yield ""
             yield from _details(run)
 

@@ -5,38 +5,22 @@
 #include "client/process/ExitStatus.h"
 #include "client/process/TClientError.h"
 #include "client/process/TProgress.h"
-#include "client/report/CimXmlFormat.h"
 #include "client/report/DescribeNothingCompared.h"
-#include "client/report/JsonFormat.h"
 #include "client/report/TResultOutput.h"
-#include "client/report/TTextFormat.h"
+#include "client/report/WriteReport.h"
 #include "client/rules/ReadRules.h"
 
 namespace NORVZEL20 {
 
 namespace {
 
-void Write(const TComparisonReport& report, const TCompareOptions& options, IConsole& console, const TTextSink& sink)
-{
-    switch (options.format) {
-    case EOutputFormat::kJson:
-        return WriteJsonReport(report, sink);
-    case EOutputFormat::kNdjson:
-        return WriteNdjsonReport(report, sink);
-    case EOutputFormat::kCimXml:
-        return WriteCimXmlReport(report, sink);
-    case EOutputFormat::kText:
-        break;
-    }
-    TTextFormat(report, console.IsColored() && IsStandardOutput(options.output)).Write(sink);
-}
-
 void Deliver(const TComparisonReport& report, const TCompareOptions& options, IConsole& console)
 {
     TResultOutput output(console, options.output);
     {
         const TProgress progress(console, "writing the report");
-        Write(report, options, console, [&output](std::string_view piece) { output.Write(piece); });
+        const bool isColored = console.IsColored() && IsStandardOutput(options.output);
+        WriteReport(report, options.format, isColored, [&output](std::string_view piece) { output.Write(piece); });
     }
     output.Deliver();
 }

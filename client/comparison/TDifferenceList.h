@@ -16,7 +16,7 @@
 namespace NORVZEL20 {
 
 /// The differences of a run. They are made from its records whenever they are read, one after the other: the list holds a pointer
-/// for each and nothing else of them.
+/// for each and nothing else of them, and beside that an index of the instances of the class that is read (TInstanceIndex).
 ///
 /// Threads: one at a time.
 class TDifferenceList {

@@ -4,7 +4,6 @@
 #include <string>
 #include <vector>
 
-#include "client/comparison/TDeltaRecord.h"
 #include "client/comparison/TDifference.h"
 #include "client/comparison/TInstanceIndex.h"
 #include "client/comparison/TValueGroups.h"
@@ -19,7 +18,8 @@ class TDifferenceReader {
     /// The arguments must outlive this. The inventories are those of the run, in its order.
     TDifferenceReader(const std::vector<TInventory>& inventories, TRules& rules) : fInventories(inventories), fRules(rules) {}
 
-    /// From now on, all records are those of the class. Does nothing if they were before. Errors: TZELException of a namespace.
+    /// From now on, all records are those of the class. Does nothing if it is that class already. Errors: TZELException of a
+    /// namespace.
     void StartClass(const std::string& className);
 
     /// The difference that a record stands for. Errors: TZELException of a namespace; std::out_of_range if the record is not of a

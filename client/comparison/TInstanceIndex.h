@@ -14,7 +14,7 @@
 namespace NORVZEL20 {
 
 /// The instances of one class of one namespace by their keys, usually as the rules define them. It holds no keys, only their
-/// hashes: 24 bytes for each instance.
+/// hashes: 24 bytes for each instance. Threads: one at a time.
 class TInstanceIndex {
   public:
     using TInstances = std::vector<boost::shared_ptr<ICIMInstance>>;

@@ -10,7 +10,7 @@ namespace NORVZEL20 {
 
 /// What all inventories are known to declare: classes with their properties, inherited ones too, in one spelling.
 ///
-/// A class that is covered need not be held against the other inventories. It copies all names, because a spelling may change in
+/// A class that is covered need not be compared with the other inventories. It copies all names, because a spelling may change in
 /// place.
 /// Threads: as any container.
 class TAgreedNames {

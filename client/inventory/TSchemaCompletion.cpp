@@ -9,9 +9,9 @@
 // What an early source declares in a later one is there when that one is the source; so one pass over all makes the union.
 //
 // Most classes of a source bring nothing new. Once a class has been taken to all inventories, its names are noted (TAgreedNames),
-// and a later source with the same names, or fewer, need not be held against the others: inventories lose no declaration meanwhile.
-// Only a spelling can change, if the classes above differ; the class is then forgotten and taken to all inventories once more. So N
-// inventories with the same C classes cost N times C steps.
+// and a later source with the same names, or fewer, need not be compared with the others: inventories lose no declaration
+// meanwhile. Only a spelling can change, if the classes above differ; the class is then forgotten and taken to all inventories once
+// more. So N inventories with the same C classes cost N times C steps.
 //
 // One name is decided beforehand: the plug-in knows the time of collection, which it leaves out, in one spelling only. Stored
 // references name classes and keys. Those of changed inventories are rewritten at the end.

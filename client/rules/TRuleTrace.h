@@ -17,7 +17,7 @@
 
 namespace NORVZEL20 {
 
-/// Which element of a rules file decides what, class by class.
+/// Which element of a rules file decides what, class by class. Threads: one at a time, also for operations that are const.
 class TRuleTrace {
   public:
     /// A treatment and the element that gave it.

@@ -162,7 +162,7 @@ class CIMDELTA_EXPORT TInMemClass final : public TInMemNamedElement<ICIMClass>, 
     std::vector<boost::weak_ptr<TInMemClass>> fSubClasses;
     std::vector<boost::weak_ptr<TInMemClass>> fAssociations;  // added by AddAssociationClass
     boost::weak_ptr<TInMemGroup> fGroup;                      // the last one; its instances hold it
-    std::uint32_t fPlaces = 0;  // in all groups so far, as far as the size of the next one depends on it
+    std::uint32_t fPlaces = 0;                                // how many the groups have so far; no longer counted from 64 on
     TInMemLayout fLayout;
     TInMemMethodSet fMethods;
 };

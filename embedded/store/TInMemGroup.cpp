@@ -4,7 +4,7 @@
 //
 // All this is one allocation, of the size that the class has slots at that moment. The property in slot n stands at position n
 // behind its instance, so reading one follows no pointer. Class and counts are held once for the group; for a hundred thousand
-// instances these would else be a tenth of the memory. Handles point into the instances and keep the group.
+// instances these would otherwise be a tenth of the memory. Handles point into the instances and keep the group.
 
 #include "embedded/store/TInMemGroup.h"
 

@@ -5,7 +5,6 @@
 #include <cstdint>
 
 #include "embedded/store/TInMemInstance.h"
-#include "embedded/store/TInMemLayout.h"
 
 namespace NORVZEL20 {
 
@@ -28,7 +27,7 @@ class TInMemGroup : public boost::enable_shared_from_this<TInMemGroup> {
     ~TInMemGroup();
 
     const boost::shared_ptr<TInMemClass>& GetClass() const noexcept { return fClass; }
-    /// Whether there is room for one more instance, and it would have a place for each property of the class or as many as can be.
+    /// Whether one more instance fits, and the class has no more properties than when the group was made.
     bool HasRoom() const noexcept;
     /// Makes an instance with every property null. There must be room.
     TInMemInstance& Make() noexcept;
@@ -38,7 +37,7 @@ class TInMemGroup : public boost::enable_shared_from_this<TInMemGroup> {
     TInMemInstance& GetInstance(std::uint32_t position) noexcept;
 
     boost::shared_ptr<TInMemClass> fClass;
-    std::uint8_t fSlots;  // whose properties stand behind each instance
+    std::uint8_t fSlots;  // properties behind each instance
     std::uint8_t fCapacity;
     std::uint8_t fCount = 0;
 };

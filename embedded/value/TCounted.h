@@ -22,7 +22,7 @@ class TCounted {
 
     bool IsUnique() const noexcept { return fUses.load(std::memory_order_acquire) == 1; }
 
-    /// Gives a block that nobody uses its first use again.
+    /// Makes the caller the only user of a block that has none.
     void Revive() const noexcept { fUses.store(1, std::memory_order_relaxed); }
 
   private:

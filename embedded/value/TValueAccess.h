@@ -34,11 +34,12 @@ class CIMDELTA_INTERNAL_EXPORT TValueAccess {
     /// A string that shares `text`, or has a copy of a short one. `text` must not be null.
     static TCIMValue FromSharedText(const TSharedText::TPointer& text) noexcept;
 
-    /// A string whose text is the one at `offset` of `run`, of which it becomes a user.
+    /// A string whose text is the one at `offset` of `run`, and uses the run.
     static TCIMValue FromRun(const TTextRun& run, std::uint16_t offset, std::uint16_t length) noexcept;
 
     /// The text of a value for which IsText is true.
     static std::string_view GetText(const TCIMValue& value) noexcept;
+    // The forms of text follow each other.
     static bool IsText(const TCIMValue& value) noexcept { return value.fForm >= kShortText && value.fForm <= kRunText; }
 
     /// Whether type, form and contents have the same bytes. Equal values may have different ones.

@@ -26,6 +26,12 @@ namespace NORVZEL20 {
 
 namespace {
 
+/// Whether a quoted text has a backslash in front of the character.
+bool IsEscaped(char c, char quote)
+{
+    return c == quote || c == '\\';
+}
+
 using TType = TCIMValue::TCIMType;
 
 constexpr std::string_view kBlanks = " \t\r\n";
@@ -243,7 +249,7 @@ bool TValueText::NeedsEscape(std::string_view text, char quote) noexcept
     const std::uint64_t quotes = kOnes * static_cast<unsigned char>(quote);
     const std::uint64_t backslashes = kOnes * static_cast<unsigned char>('\\');
     if (text.size() < sizeof quotes) {
-        return std::any_of(text.begin(), text.end(), [quote](char c) { return c == quote || c == '\\'; });
+        return std::any_of(text.begin(), text.end(), [quote](char c) { return IsEscaped(c, quote); });
     }
     const auto findsAny = [&](std::size_t position) {
         std::uint64_t word;
@@ -268,14 +274,14 @@ void TValueText::EscapeFrom(std::string& out, std::size_t start, char quote)
     }
     std::size_t escapes = 0;
     for (std::size_t i = start; i < out.size(); ++i) {
-        escapes += out[i] == quote || out[i] == '\\' ? 1 : 0;
+        escapes += IsEscaped(out[i], quote) ? 1 : 0;
     }
     std::size_t from = out.size();
     out.resize(out.size() + escapes);
     for (std::size_t to = out.size(); from != to;) {
         const char c = out[--from];
         out[--to] = c;
-        if (c == quote || c == '\\') {
+        if (IsEscaped(c, quote)) {
             out[--to] = '\\';
         }
     }

@@ -174,12 +174,12 @@ TEST(Threads, EightQueriesOverNamespacesOfTheirOwnAreAsOne)
     });
 }
 
-/// Each thread recycles the contents of paths. One of these paths ends after all that its thread keeps for that, the others on
-/// another thread than the one that made them.
+/// Each thread recycles the contents of paths that are made without a namespace. One of these paths ends after all that its thread
+/// keeps for that, the others on another thread than the one that made them.
 TEST(Threads, PathsMayOutliveTheirThreadAndWhatItKeepsForThem)
 {
     const auto makePath = [](int number) {
-        TCIMReference path;
+        TCIMReference path(boost::shared_ptr<ICIMNamespace>{}, {});
         path.SetClassName("Disk");
         path.AddKeyValue("Id", TCIMValue(number));
         return path;

@@ -74,7 +74,7 @@ TEST_F(InstanceIndexTest, FindsInstancesInTheOrderOfTheNamespace)
     EXPECT_EQ("Acme: sda sdb Zeta: sdd sdc ", All(index));
 }
 
-TEST_F(InstanceIndexTest, KeysWithTheSameHashAreToldApart)
+TEST_F(InstanceIndexTest, KeysWithTheSameHashAreDifferent)
 {
     fAllHashesAreEqual = true;
     TInstanceIndex index = IndexBy("Vendor");

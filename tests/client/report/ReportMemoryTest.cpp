@@ -2,10 +2,8 @@
 
 #include "client/comparison/TComparison.h"
 #include "client/inventory/TInventoryLoader.h"
-#include "client/report/CimXmlFormat.h"
 #include "client/report/EOutputFormat.h"
-#include "client/report/JsonFormat.h"
-#include "client/report/TTextFormat.h"
+#include "client/report/WriteReport.h"
 #include "tests/client/Documents.h"
 #include "tests/client/TClientFixture.h"
 #include "tests/hostile/TMemoryMeter.h"
@@ -47,20 +45,6 @@ class ReportMemoryTest : public TClientFixture {
         fInventories = TInventoryLoader(fConsole).Load(paths);
     }
 
-    static void Write(const TComparisonReport& report, EOutputFormat format, const TTextSink& sink)
-    {
-        switch (format) {
-        case EOutputFormat::kText:
-            return TTextFormat(report, false).Write(sink);
-        case EOutputFormat::kJson:
-            return WriteJsonReport(report, sink);
-        case EOutputFormat::kNdjson:
-            return WriteNdjsonReport(report, sink);
-        case EOutputFormat::kCimXml:
-            return WriteCimXmlReport(report, sink);
-        }
-    }
-
     /// The most bytes that writing has in use at a time. The length of the report is added to fLength.
     std::size_t PeakOfWriting(EOutputFormat format, int instances, int changed)
     {
@@ -69,7 +53,7 @@ class ReportMemoryTest : public TClientFixture {
         EXPECT_EQ(static_cast<std::size_t>(instances * changed), report.differences->GetCounts().GetTotal());
         const TMemoryMeter meter;
         fLength = 0;
-        Write(report, format, [this](std::string_view piece) { fLength += piece.size(); });
+        WriteReport(report, format, false, [this](std::string_view piece) { fLength += piece.size(); });
         return meter.GetPeak();
     }
 

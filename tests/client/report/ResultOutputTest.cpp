@@ -2,6 +2,11 @@
 
 #include "client/report/TResultOutput.h"
 
+#include <sys/stat.h>
+
+#include <chrono>
+#include <future>
+
 #include "tests/client/TClientFixture.h"
 #include "tests/client/TOutputFolder.h"
 
@@ -58,11 +63,15 @@ TEST_F(ResultOutputTest, AResultThatIsNotDeliveredLeavesNothing)
     EXPECT_EQ("report ", fFolder.List());
 }
 
-TEST_F(ResultOutputTest, ADeviceTakesAllOfIt)
+TEST_F(ResultOutputTest, APipeTakesAllOfItAtTheEnd)
 {
-    TResultOutput output(fConsole, "/dev/null");
+    ASSERT_EQ(0, mkfifo(fFile.c_str(), 0600));
+    std::future<std::string> read = std::async(std::launch::async, [this] { return ReadFile(fFile); });
+    TResultOutput output(fConsole, fFile);
     WritePieces(output);
-    output.Deliver();
+    EXPECT_EQ(std::future_status::timeout, read.wait_for(std::chrono::seconds(0)));
+    output.Deliver("the end");
+    EXPECT_TRUE(fResult + "the end" == read.get());
     EXPECT_EQ("", fConsole.fOut);
 }
 

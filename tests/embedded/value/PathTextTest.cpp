@@ -124,7 +124,7 @@ TEST(PathText, AQuoteOrBackslashIsFoundAtEachPlace)
     EXPECT_FALSE(TValueText::NeedsEscape("", '"'));
 }
 
-/// The contents of a path that ends are used again.
+/// The contents of a path that ends are used again by the next one that is made without a namespace.
 TEST(PathText, APathHasNothingOfThoseThatEndedBefore)
 {
     for (int round = 0; round < 10; ++round) {
@@ -133,8 +133,13 @@ TEST(PathText, APathHasNothingOfThoseThatEndedBefore)
             outer.SetNamespaceName("root/cimv2");
             outer.SetHost("web01");
             EXPECT_EQ("//web01/root/cimv2:Disk.Unit=\"Disk.Id=\\\"a\\\"\"", outer.GetPath());
+            TCIMReference large(boost::shared_ptr<ICIMNamespace>{}, {});
+            for (char name = 'A'; name < 'A' + 20; ++name) {
+                large.AddKeyValue(std::string(1, name), TCIMValue(1));
+            }
+            EXPECT_EQ(20u, large.GetKeyCount());
         }
-        TCIMReference path;
+        TCIMReference path(boost::shared_ptr<ICIMNamespace>{}, {});
         path.AddKeyValue("Id", TCIMValue(round));
         EXPECT_EQ(".Id=" + std::to_string(round), path.GetPath());
         EXPECT_EQ("", path.GetNamespaceName());

@@ -1,0 +1,13 @@
+#pragma once
+
+#include "client/comparison/TComparisonReport.h"
+#include "client/report/OutputFormats.h"
+#include "client/report/TTextSink.h"
+
+namespace NORVZEL20 {
+
+/// Hands the report to `sink` in that format, piece by piece. `isColored` matters to text alone. Errors: those of
+/// TDifferenceList::ForEach; what the sink throws.
+void WriteReport(const TComparisonReport& report, EOutputFormat format, bool isColored, const TTextSink& sink);
+
+}  // namespace NORVZEL20
