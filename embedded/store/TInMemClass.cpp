@@ -12,7 +12,6 @@
 #include "embedded/store/InMemClassChecks.h"
 #include "embedded/store/TDeclCopy.h"
 #include "embedded/store/TInMemExtent.h"
-#include "embedded/store/TInMemGroup.h"
 #include "embedded/store/TInMemNamespace.h"
 #include "embedded/store/TStoreRefusal.h"
 #include "embedded/value/EraseLast.h"
@@ -241,16 +240,7 @@ std::size_t TInMemClass::GetInstanceCount() const noexcept
 
 boost::shared_ptr<TInMemInstance> TInMemClass::AllocateInMemInstance()
 {
-    boost::shared_ptr<TInMemGroup> group = fGroup.lock();
-    if (!group || !group->HasRoom()) {
-        // At most a fifth of the places in all groups stays free.
-        const std::uint32_t count = std::clamp(fPlaces / 4, 1U, TInMemGroup::kMostInstances);
-        group = TInMemGroup::Create(shared_from_this(), count);
-        fGroup = group;
-        fPlaces = std::min(fPlaces + count, 4 * TInMemGroup::kMostInstances);
-    }
-    TInMemInstance& instance = group->Make();
-    return boost::shared_ptr<TInMemInstance>(std::move(group), &instance);
+    return TInMemInstance::Create(shared_from_this());
 }
 
 boost::shared_ptr<ICIMInstance> TInMemClass::AllocateInstance(TCallContext)

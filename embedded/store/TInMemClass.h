@@ -17,7 +17,6 @@
 namespace NORVZEL20 {
 
 class TInMemExtent;
-class TInMemGroup;
 class TInMemNamespace;
 
 /// A class of an in-memory namespace.
@@ -161,8 +160,6 @@ class CIMDELTA_EXPORT TInMemClass final : public TInMemNamedElement<ICIMClass>, 
     TInMemExtent* fExtent = nullptr;  // the namespace's; null while the class is not declared there
     std::vector<boost::weak_ptr<TInMemClass>> fSubClasses;
     std::vector<boost::weak_ptr<TInMemClass>> fAssociations;  // added by AddAssociationClass
-    boost::weak_ptr<TInMemGroup> fGroup;                      // the last one; its instances hold it
-    std::uint32_t fPlaces = 0;                                // how many the groups have so far; no longer counted from 64 on
     TInMemLayout fLayout;
     TInMemMethodSet fMethods;
 };

@@ -1,6 +1,9 @@
-// The properties of an instance.
+// How an instance lies in memory.
 //
-// Most stand behind the instance (TInMemGroup.cpp draws this). When the class gets a property later, the instance cannot grow in
+//   [ counts of the shared pointer | TInMemInstance | property | property | ... ]
+//
+// All this is one allocation, of the size that the class has slots at that moment, and reading a property follows no pointer. The
+// property in slot n stands at position n behind the instance. When the class gets a property later, the instance cannot grow in
 // place, because handles point into it. A late block then holds slots that are missing; it is made when one of them is first
 // asked for, for all slots that the class has by then. So most instances have none, few have one, and an instance has another only
 // if the class grows again or has very many properties. Late blocks and notes are kept in the extras, which most instances do
@@ -10,13 +13,14 @@
 #include "embedded/store/TInMemInstance.h"
 
 #include <algorithm>
+#include <utility>
 #include <vector>
 
 #include "embedded/store/TInMemClass.h"
 #include "embedded/store/TInMemExtent.h"
-#include "embedded/store/TInMemGroup.h"
 #include "embedded/store/TInMemLateBlock.h"
 #include "embedded/store/TInMemNamespace.h"
+#include "embedded/store/TPlacedAllocator.h"
 #include "embedded/store/TStoreRefusal.h"
 
 namespace NORVZEL20 {
@@ -30,15 +34,34 @@ struct TInMemInstance::TExtras {
         TCIMValue value;
     };
 
+    static bool StandsBefore(const TNote& note, const std::pair<std::uint32_t, EAbout>& place) noexcept
+    {
+        return std::make_pair(note.slot, note.about) < place;
+    }
+
     const TNote* Find(EAbout about, std::uint32_t slot) const noexcept
     {
-        const auto found =
-            std::find_if(notes.begin(), notes.end(), [&](const TNote& note) { return note.slot == slot && note.about == about; });
-        return found == notes.end() ? nullptr : &*found;
+        const auto found = std::lower_bound(notes.begin(), notes.end(), std::make_pair(slot, about), &StandsBefore);
+        return found != notes.end() && found->slot == slot && found->about == about ? &*found : nullptr;
+    }
+
+    /// Makes room for so many notes, which Add then takes without fail. Errors: std::bad_alloc.
+    void MakeRoom(std::size_t more)
+    {
+        if (notes.capacity() - notes.size() < more) {
+            notes.reserve(2 * notes.size() + more);
+        }
+    }
+
+    void Add(EAbout about, std::uint32_t slot, TCIMValue&& value)
+    {
+        MakeRoom(1);
+        const auto place = std::lower_bound(notes.begin(), notes.end(), std::make_pair(slot, about), &StandsBefore);
+        notes.insert(place, {slot, about, std::move(value)});
     }
 
     std::vector<TInMemLateBlock::TPointer> lateBlocks;  ///< in order of slots
-    std::vector<TNote> notes;
+    std::vector<TNote> notes;                           ///< likewise; mostly made in this order
 };
 
 TInMemProperty* TInMemInstance::GetOwnProperties() const noexcept
@@ -47,11 +70,23 @@ TInMemProperty* TInMemInstance::GetOwnProperties() const noexcept
     return reinterpret_cast<TInMemProperty*>(const_cast<TInMemInstance*>(this) + 1);
 }
 
-TInMemInstance::TInMemInstance(const TInMemLayout& layout, std::uint8_t slots, std::uint16_t offset) noexcept
-    : fOffset(offset), fSlots(slots)
+boost::shared_ptr<TInMemInstance> TInMemInstance::Create(boost::shared_ptr<TInMemClass> cls)
+{
+    // One allocation for everything. The allocator puts the counts of the shared pointer in front of the instance.
+    using TAllocator = TPlacedAllocator<TInMemInstance>;
+    const std::uint32_t slots = std::min(cls->GetLayout().GetSlotCount(), TInMemProperty::kMostBehindInstance);
+    const std::size_t size = TAllocator::kPlace + sizeof(TInMemInstance) + slots * sizeof(TInMemProperty);
+    char* const block = static_cast<char*>(::operator new(size));
+    TInMemInstance* const instance = new (block + TAllocator::kPlace) TInMemInstance(std::move(cls), slots);
+    const auto destroy = [](TInMemInstance* made) { made->~TInMemInstance(); };
+    return boost::shared_ptr<TInMemInstance>(instance, destroy, TAllocator(block));
+}
+
+TInMemInstance::TInMemInstance(boost::shared_ptr<TInMemClass> cls, std::uint32_t slots) noexcept
+    : fClass(std::move(cls)), fSlots(slots & 0x7fffffffU), fAdded(0)
 {
     for (std::uint32_t slot = 0; slot < slots; ++slot) {
-        TInMemProperty::MakeBehindInstance(GetOwnProperties() + slot, slot, layout.GetDecl(slot).GetType());
+        TInMemProperty::MakeBehindInstance(GetOwnProperties() + slot, slot, fClass->GetLayout().GetDecl(slot).GetType());
     }
 }
 
@@ -62,43 +97,26 @@ TInMemInstance::~TInMemInstance()
     }
 }
 
-TInMemGroup& TInMemInstance::GetGroup() const noexcept
-{
-    // Operations that are const give out handles through which properties are changed.
-    char* const place = reinterpret_cast<char*>(const_cast<TInMemInstance*>(this));
-    return *(reinterpret_cast<TInMemGroup*>(place - fOffset) - 1);
-}
-
-const boost::shared_ptr<TInMemClass>& TInMemInstance::GetInMemClass() const noexcept
-{
-    return GetGroup().GetClass();
-}
-
-const TInMemLayout& TInMemInstance::GetLayout() const noexcept
-{
-    return GetInMemClass()->GetLayout();
-}
-
 void TInMemInstance::Validate(TCallContext) const
 {
-    GetInMemClass()->GetExtent().Check(*this);
+    fClass->GetExtent().Check(*this);
 }
 
 void TInMemInstance::AddToNamespace(TCallContext)
 {
-    GetInMemClass()->GetExtent().Add(boost::shared_ptr<TInMemInstance>(GetGroup().shared_from_this(), this));
+    fClass->GetExtent().Add(shared_from_this());
 }
 
 TCIMReference TInMemInstance::GetReference() const
 {
-    const auto ns = GetInMemClass()->GetInMemNamespace();
+    const auto ns = fClass->GetInMemNamespace();
     TCIMReference path(ns, std::map<std::string, TCIMValue>());
     // The class keeps the name of its namespace, which completes the path.
     if (!ns) {
-        path.SetNamespaceName(GetInMemClass()->GetNamespaceName());
+        path.SetNamespaceName(fClass->GetNamespaceName());
     }
-    path.SetClass(GetInMemClass());
-    const TInMemLayout& layout = GetLayout();
+    path.SetClass(fClass);
+    const TInMemLayout& layout = fClass->GetLayout();
     for (const std::uint32_t slot : layout.GetKeys()) {
         path.AddKeyValue(layout.GetDecl(slot).GetName(), GetAddedKey(slot));
     }
@@ -112,40 +130,36 @@ TCIMReference TInMemInstance::GetReference(TCallContext) const
 
 boost::shared_ptr<ICIMClass> TInMemInstance::GetClass(TCallContext) const
 {
-    return GetInMemClass();
+    return fClass;
 }
 
 /// A static property lives in its declaration, any other one in the instance; the handle keeps that object alive.
-boost::shared_ptr<ICIMProperty> TInMemInstance::GetHandle(const TInMemLayout& layout, std::uint32_t slot,
-                                                          boost::shared_ptr<TInMemGroup> group) const
+boost::shared_ptr<ICIMProperty> TInMemInstance::GetHandle(std::uint32_t slot, boost::shared_ptr<const TInMemInstance> self) const
 {
-    const auto& decl = layout.GetSharedDecl(slot);
+    const auto& decl = fClass->GetLayout().GetSharedDecl(slot);
     if (decl->IsStatic()) {
         return boost::shared_ptr<ICIMProperty>(decl, &decl->GetStaticProperty());
     }
-    return boost::shared_ptr<ICIMProperty>(std::move(group), &GetSlotProperty(slot));
+    return boost::shared_ptr<ICIMProperty>(std::move(self), &GetSlotProperty(slot));
 }
 
 boost::shared_ptr<ICIMProperty> TInMemInstance::GetProperty(const std::string& name, TCallContext) const
 {
-    TInMemGroup& group = GetGroup();
-    const TInMemLayout& layout = group.GetClass()->GetLayout();
-    const std::uint32_t slot = layout.FindSlot(name);
+    const std::uint32_t slot = fClass->GetLayout().FindSlot(name);
     if (slot == TInMemLayout::kNoSlot) {
         throw TStoreRefusal(TZELStatusCode::kNotFound,
                             [&] { return "property " + name + " of instance " + TStoreRefusal::Shown(GetReference()); });
     }
-    return GetHandle(layout, slot, group.shared_from_this());
+    return GetHandle(slot, shared_from_this());
 }
 
 void TInMemInstance::EnumerateProperties(const boost::function<bool(boost::shared_ptr<ICIMProperty>)>& callback, TCallContext) const
 {
-    const boost::shared_ptr<TInMemGroup> group = GetGroup().shared_from_this();
-    const TInMemLayout& layout = GetLayout();
-    const std::vector<std::uint32_t>& order = layout.GetOrder();
+    const auto self = shared_from_this();
+    const std::vector<std::uint32_t>& order = fClass->GetLayout().GetOrder();
     // The loop goes by position, because the callback may add properties to the class.
     for (std::size_t at = 0; at < order.size(); ++at) {
-        if (!callback(GetHandle(layout, order[at], group))) {
+        if (!callback(GetHandle(order[at], self))) {
             return;
         }
     }
@@ -153,8 +167,8 @@ void TInMemInstance::EnumerateProperties(const boost::function<bool(boost::share
 
 TInMemProperty* TInMemInstance::FindProperty(std::string_view name) const
 {
-    const std::uint32_t slot = GetLayout().FindSlot(name);
-    if (slot == TInMemLayout::kNoSlot || GetLayout().GetDecl(slot).IsStatic()) {
+    const std::uint32_t slot = fClass->GetLayout().FindSlot(name);
+    if (slot == TInMemLayout::kNoSlot || fClass->GetLayout().GetDecl(slot).IsStatic()) {
         return nullptr;
     }
     return &GetSlotProperty(slot);
@@ -167,13 +181,13 @@ TInMemProperty& TInMemInstance::GetSlotProperty(std::uint32_t slot) const
 
 const TCIMValue& TInMemInstance::GetSlotValue(std::uint32_t slot) const
 {
-    const auto& decl = GetLayout().GetSharedDecl(slot);
+    const auto& decl = fClass->GetLayout().GetSharedDecl(slot);
     return decl->IsStatic() ? decl->GetStaticProperty().GetValue() : GetSlotProperty(slot).GetValue();
 }
 
 void TInMemInstance::SetSlot(std::uint32_t slot, TCIMValue value)
 {
-    const auto& decl = GetLayout().GetSharedDecl(slot);
+    const auto& decl = fClass->GetLayout().GetSharedDecl(slot);
     if (decl->IsStatic()) {
         decl->GetStaticProperty().SetValue(value);
         return;
@@ -183,8 +197,8 @@ void TInMemInstance::SetSlot(std::uint32_t slot, TCIMValue value)
 
 const std::string* TInMemInstance::FindMissingKey() const
 {
-    for (const std::uint32_t slot : GetLayout().GetKeys()) {
-        const TInMemPropertyDecl& decl = GetLayout().GetDecl(slot);
+    for (const std::uint32_t slot : fClass->GetLayout().GetKeys()) {
+        const TInMemPropertyDecl& decl = fClass->GetLayout().GetDecl(slot);
         if (!decl.IsGenerated() && GetSlotValue(slot).IsNull()) {
             return &decl.GetName();
         }
@@ -211,7 +225,7 @@ TInMemProperty& TInMemInstance::GetLateProperty(std::uint32_t slot) const
         }
     }
     while (slot >= end) {
-        lateBlocks.push_back(TInMemLateBlock::Make(const_cast<TInMemInstance&>(*this), GetLayout(), end));
+        lateBlocks.push_back(TInMemLateBlock::Make(const_cast<TInMemInstance&>(*this), fClass->GetLayout(), end));
         end = lateBlocks.back()->GetEnd();
     }
     return lateBlocks.back()->GetProperty(slot - lateBlocks.back()->GetFirst());
@@ -219,7 +233,7 @@ TInMemProperty& TInMemInstance::GetLateProperty(std::uint32_t slot) const
 
 TCIMValue TInMemInstance::Fit(std::uint32_t slot, TCIMValue&& value) const
 {
-    return GetLayout().GetDecl(slot).Fit(std::move(value), this);
+    return fClass->GetLayout().GetDecl(slot).Fit(std::move(value), this);
 }
 
 /// Everything that may fail comes first: the caller has checked the new value, and the old one is kept if it will be asked for.
@@ -228,8 +242,8 @@ void TInMemInstance::Change(std::uint32_t slot, TCIMValue&& fitting)
 {
     TInMemProperty& property = GetSlotProperty(slot);
     // The index of the extent finds the instance by the key that it was added with.
-    if (fAdded && GetLayout().GetDecl(slot).IsKey() && !GetExtras().Find(TExtras::EAbout::kAddedKey, slot)) {
-        fExtras->notes.push_back({slot, TExtras::EAbout::kAddedKey, property.fValue});
+    if (fAdded != 0 && fClass->GetLayout().GetDecl(slot).IsKey() && !GetExtras().Find(TExtras::EAbout::kAddedKey, slot)) {
+        fExtras->Add(TExtras::EAbout::kAddedKey, slot, TCIMValue(property.fValue));
     }
     property.fValue = std::move(fitting);
 }
@@ -241,11 +255,10 @@ void TInMemInstance::MarkChanged(std::uint32_t slot, TCIMValue&& fitting)
         return;
     }
     // Room first: the change itself may need room for a note too, and once it is made, nothing may fail.
-    std::vector<TExtras::TNote>& notes = GetExtras().notes;
-    notes.reserve(notes.size() + 2);
+    GetExtras().MakeRoom(2);
     TCIMValue earlier = GetSlotProperty(slot).fValue;
     Change(slot, std::move(fitting));
-    notes.push_back({slot, TExtras::EAbout::kEarlier, std::move(earlier)});
+    fExtras->Add(TExtras::EAbout::kEarlier, slot, std::move(earlier));
 }
 
 const TCIMValue* TInMemInstance::FindEarlier(std::uint32_t slot) const noexcept
@@ -257,7 +270,7 @@ const TCIMValue* TInMemInstance::FindEarlier(std::uint32_t slot) const noexcept
 void TInMemInstance::MarkRemoved(std::uint32_t slot)
 {
     if (!IsMarkedRemoved(slot)) {
-        GetExtras().notes.push_back({slot, TExtras::EAbout::kRemoved, TCIMValue()});
+        GetExtras().Add(TExtras::EAbout::kRemoved, slot, TCIMValue());
     }
 }
 
@@ -275,12 +288,12 @@ const TCIMValue& TInMemInstance::GetAddedKey(std::uint32_t slot) const
 void TInMemInstance::SetAdded(std::uint32_t keyHash) noexcept
 {
     fKeyHash = keyHash;
-    fAdded = true;
+    fAdded = 1;
 }
 
 void TInMemInstance::SetRemoved() noexcept
 {
-    fAdded = false;
+    fAdded = 0;
     if (fExtras) {
         // Outside of an extent the present keys count.
         const auto isKey = [](const TExtras::TNote& note) { return note.about == TExtras::EAbout::kAddedKey; };

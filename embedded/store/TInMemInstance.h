@@ -1,6 +1,6 @@
 #pragma once
 
-#include <boost/smart_ptr/shared_ptr.hpp>
+#include <boost/smart_ptr/enable_shared_from_this.hpp>
 #include <cstdint>
 #include <memory>
 #include <string>
@@ -13,16 +13,17 @@
 namespace NORVZEL20 {
 
 class TInMemClass;
-class TInMemGroup;
-class TInMemLayout;
 
-/// An instance in memory, with its properties behind it. It lives in a TInMemGroup, which holds its class.
+/// An instance in memory: one block with the shared pointer's counts, the instance and its properties.
 ///
 /// TInMemClass::AllocateInMemInstance makes it. A property that the class gets later is made when it is first asked for, and so are
-/// those beyond the first TInMemProperty::kMostBehindInstance. Handles stay valid when the instance is deleted and when the
-/// namespace goes; AddToNamespace then throws kNamespaceGone (18). Threads: as the namespace, reading included.
-class CIMDELTA_EXPORT TInMemInstance final : public ICIMInstance {
+/// those beyond the first TInMemProperty::kMostBehindInstance. Handles
+/// stay valid when the instance is deleted and when the namespace goes; AddToNamespace then throws kNamespaceGone (18).
+/// Threads: as the namespace, reading included.
+class CIMDELTA_EXPORT TInMemInstance final : public ICIMInstance, public boost::enable_shared_from_this<TInMemInstance> {
   public:
+    /// An instance of `cls` with every property null.
+    static boost::shared_ptr<TInMemInstance> Create(boost::shared_ptr<TInMemClass> cls);
     TInMemInstance(const TInMemInstance&) = delete;
     TInMemInstance& operator=(const TInMemInstance&) = delete;
     ~TInMemInstance() override;
@@ -40,7 +41,7 @@ class CIMDELTA_EXPORT TInMemInstance final : public ICIMInstance {
 
     /// As the operations above, without context.
     TCIMReference GetReference() const;
-    const boost::shared_ptr<TInMemClass>& GetInMemClass() const noexcept;
+    const boost::shared_ptr<TInMemClass>& GetInMemClass() const noexcept { return fClass; }
     /// The instance's own property of that name; null if the class declares none, and for a static one. Valid while the instance
     /// lives.
     TInMemProperty* FindProperty(std::string_view name) const;
@@ -52,7 +53,7 @@ class CIMDELTA_EXPORT TInMemInstance final : public ICIMInstance {
     void SetSlot(std::uint32_t slot, TCIMValue value);
 
     /// Whether it is part of the namespace.
-    bool IsAdded() const noexcept { return fAdded; }
+    bool IsAdded() const noexcept { return fAdded != 0; }
     /// The name of the first key without a value, which keeps the instance from being added; null if there is none.
     const std::string* FindMissingKey() const;
     /// The value of a key as it was when the instance was added, which counts while the instance is in the namespace.
@@ -73,8 +74,6 @@ class CIMDELTA_EXPORT TInMemInstance final : public ICIMInstance {
     void MarkRemoved(std::uint32_t slot);
     bool IsMarkedRemoved(std::uint32_t slot) const noexcept;
 
-    /// The bytes that an instance takes together with `slots` properties behind it.
-    static constexpr std::size_t GetSize(std::uint32_t slots) noexcept;
     /// The instance that the row of properties beginning with `first` stands behind.
     static TInMemInstance& GetOwner(const TInMemProperty& first) noexcept
     {
@@ -84,33 +83,22 @@ class CIMDELTA_EXPORT TInMemInstance final : public ICIMInstance {
 
   private:
     friend class TInMemExtent;  // the owner: it alone says whether the instance is part of the namespace
-    friend class TInMemGroup;   // the maker: it provides the memory
 
     struct TExtras;  // what few instances have
 
-    TInMemInstance(const TInMemLayout& layout, std::uint8_t slots, std::uint16_t offset) noexcept;
-    TInMemGroup& GetGroup() const noexcept;
-    const TInMemLayout& GetLayout() const noexcept;
+    TInMemInstance(boost::shared_ptr<TInMemClass> cls, std::uint32_t slots) noexcept;
     TInMemProperty* GetOwnProperties() const noexcept;
-    boost::shared_ptr<ICIMProperty> GetHandle(const TInMemLayout& layout, std::uint32_t slot,
-                                              boost::shared_ptr<TInMemGroup> group) const;
+    boost::shared_ptr<ICIMProperty> GetHandle(std::uint32_t slot, boost::shared_ptr<const TInMemInstance> self) const;
     TExtras& GetExtras() const;
     TInMemProperty& GetLateProperty(std::uint32_t slot) const;
     void SetAdded(std::uint32_t keyHash) noexcept;
     void SetRemoved() noexcept;
 
+    boost::shared_ptr<TInMemClass> fClass;
     mutable std::unique_ptr<TExtras> fExtras;
     std::uint32_t fKeyHash = 0;
-    std::uint16_t fOffset;  // in bytes, from the first instance of its group
-    std::uint8_t fSlots;    // whose properties stand behind the instance
-    bool fAdded = false;
+    std::uint32_t fSlots : 31;  // whose properties stand behind the instance
+    std::uint32_t fAdded : 1;
 };
-
-constexpr std::size_t TInMemInstance::GetSize(std::uint32_t slots) noexcept
-{
-    return sizeof(TInMemInstance) + slots * sizeof(TInMemProperty);
-}
-
-static_assert(sizeof(TInMemInstance) == 24, "what all instances of a group share is kept in the group");
 
 }  // namespace NORVZEL20

@@ -74,6 +74,14 @@ TEST_F(InMemMemoryTest, ReadingAPropertyAllocatesNothing)
     EXPECT_EQ("amd64", value.GetString());
 }
 
+TEST_F(InMemMemoryTest, AnInstanceIsOneAllocation)
+{
+    const auto cls = DeclarePackage();
+    const std::size_t before = CountedAllocations();
+    const auto instance = cls->AllocateInMemInstance();
+    EXPECT_EQ(before + 1, CountedAllocations());
+}
+
 /// Names of up to 15 bytes take no allocation of their own; a longer one is read into one, which the path takes over.
 TEST_F(InMemMemoryTest, ReadingAPathAllocatesEachNameOnce)
 {
