@@ -19,44 +19,24 @@ namespace {
 
 constexpr std::size_t kUsualKeyCount = 4;  // a class with more keys is no error
 
-/// Takes the parts of a path that nobody needs.
-struct TNoPath {
-    void SetClass(const boost::shared_ptr<ICIMClass>&) {}
-    void AddKeyValue(const std::string&, const TCIMValue&) {}
-};
-
-/// Reads the class of the instance and its keys that are not excluded, and adds them to the path.
-template <class TPath>
-void ReadKeyTo(TPath& path, TCIMDiffEngine::TDiffClassRules& rules, const ICIMInstance& instance)
-{
-    // Keeps the class alive, because the pointers to its key names are used below.
-    const boost::shared_ptr<ICIMClass> cls = instance.GetClass(TCallContext());
-    std::vector<const std::string*> names;
-    names.reserve(kUsualKeyCount);
-    cls->EnumerateKeyNames(TAddKeyNamesToVectorCallback(&names), TCallContext());
-
-    path.SetClass(instance.GetClass(TCallContext()));
-    for (const std::string* name : names) {
-        if (!rules.isKeyExcluded(*name)) {
-            path.AddKeyValue(*name, instance.GetProperty(*name, TCallContext())->GetValue(TCallContext()));
-        }
-    }
-}
-
 }  // namespace
 
 std::string TCIMDiffEngine::buildPath(boost::shared_ptr<TDiffClassRules> rules, boost::shared_ptr<ICIMInstance> instance)
 {
-    TCIMReference path(boost::shared_ptr<ICIMNamespace>{}, std::map<std::string, TCIMValue>{});
-    ReadKeyTo(path, *rules, *instance);
-    return path.GetPath();
-}
+    // Keeps the class alive, because the pointers to its key names are used below.
+    const boost::shared_ptr<ICIMClass> cls = instance->GetClass(TCallContext());
+    std::vector<const std::string*> names;
+    names.reserve(kUsualKeyCount);
+    cls->EnumerateKeyNames(TAddKeyNamesToVectorCallback(&names), TCallContext());
 
-/// Makes the calls of buildPath for an instance whose key is known.
-void TCIMDiffEngine::ReadKey(TDiffClassRules& rules, const ICIMInstance& instance)
-{
-    TNoPath path;
-    ReadKeyTo(path, rules, instance);
+    TCIMReference path(boost::shared_ptr<ICIMNamespace>{}, std::map<std::string, TCIMValue>{});
+    path.SetClass(instance->GetClass(TCallContext()));
+    for (const std::string* name : names) {
+        if (!rules->isKeyExcluded(*name)) {
+            path.AddKeyValue(*name, instance->GetProperty(*name, TCallContext())->GetValue(TCallContext()));
+        }
+    }
+    return path.GetPath();
 }
 
 std::string TCIMDiffEngine::buildPath(boost::shared_ptr<TDiffClassRules> rules, const TCIMReference& path)

@@ -94,16 +94,10 @@ void TCIMDiffEngine::buildInstanceMap(boost::shared_ptr<TDiffClassRules> rules,
 {
     TMapCursor<std::map<std::string, TMasterInstance>> place(masterMap);
     for (const boost::shared_ptr<ICIMInstance>& instance : instances) {
-        EnterInstance(rules, instance, place);
-    }
-}
-
-void TCIMDiffEngine::EnterInstance(const boost::shared_ptr<TDiffClassRules>& rules, const boost::shared_ptr<ICIMInstance>& instance,
-                                   TMapCursor<std::map<std::string, TMasterInstance>>& place)
-{
-    TMasterInstance& master = place.FindOrAdd(buildPath(rules, instance)).second;
-    if (!master.instance) {
-        master.instance = instance;
+        TMasterInstance& master = place.FindOrAdd(buildPath(rules, instance)).second;
+        if (!master.instance) {
+            master.instance = instance;
+        }
     }
 }
 

@@ -14,9 +14,6 @@
 
 namespace NORVZEL20 {
 
-template <class TMap>
-class TMapCursor;
-
 /// One comparison of several namespaces. Make it, call compare() and drop it, as TDeltaNamespace::FindDifferences does.
 ///
 /// The first namespace is the reference. Every other namespace is compared with it: class by class down the reference's class
@@ -147,9 +144,6 @@ class CIMDELTA_INTERNAL_EXPORT TCIMDiffEngine {
 
     void CheckOperatingSystems();
     void CompareSubClasses(ICIMClass& cls);
-    void EnterInstance(const boost::shared_ptr<TDiffClassRules>& rules, const boost::shared_ptr<ICIMInstance>& instance,
-                       TMapCursor<std::map<std::string, TMasterInstance>>& place);
-    static void ReadKey(TDiffClassRules& rules, const ICIMInstance& instance);
     void AliasInstance(ICIMInstance& instance, const std::string& key, unsigned int namespaceIndex);
     boost::shared_ptr<ICIMInstance> AllocateRecord(const std::string& className);
     static void SetProperty(ICIMInstance& instance, const std::string& name, const TCIMValue& value);

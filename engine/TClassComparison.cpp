@@ -88,7 +88,7 @@ void TCIMDiffEngine::TClassComparison::CompareWithNamespace(std::size_t index)
     }
     const TCompareInstances compareInstances(&fEngine, fRules, &fMaster, &fMissing, &fDifferences, static_cast<unsigned int>(index),
                                              &fProperties);
-    TInstanceWalk::TState state{TMasterCursor(fMaster), TIndicesCursor(fMissing), HasTwoNamespaces() ? &fMatched : nullptr};
+    TInstanceWalk::TState state{TMasterCursor(fMaster), TIndicesCursor(fMissing)};
     fOtherClass->EnumerateInstances(TInstanceWalk(compareInstances, &state), false, TCallContext());
     NoteAbsentInstances(index);
 }
@@ -173,7 +173,8 @@ void TCIMDiffEngine::TClassComparison::RecordMissingInstances()
 {
     std::map<std::string, TMasterInstance> others;
     if (HasTwoNamespaces()) {
-        CollectMissingInstances(others);
+        std::vector<boost::shared_ptr<ICIMInstance>> instances = GetInstances(*fOtherClass);
+        fEngine.buildInstanceMap(fRules, instances, others);
     }
     TMasterCursor place(others);
     for (const auto& [key, indices] : fMissing) {
@@ -182,24 +183,6 @@ void TCIMDiffEngine::TClassComparison::RecordMissingInstances()
             // If the other namespace has no such instance any more, this adds a null pointer, which fails the host's assertion.
             const auto* const other = place.Find(key);
             CopyToReference(other != nullptr ? other->second.instance : nullptr);
-        }
-    }
-}
-
-/// Indexes the other namespace's instances by key, as the reference's are. Those that were matched in step (2) are read like the
-/// others, but they are not entered: their keys are not missing. Usually both enumerations have the same order, so the next one of
-/// them is the only one to look at.
-void TCIMDiffEngine::TClassComparison::CollectMissingInstances(std::map<std::string, TMasterInstance>& others)
-{
-    const std::vector<boost::shared_ptr<ICIMInstance>> instances = GetInstances(*fOtherClass);
-    TMasterCursor place(others);
-    auto matched = fMatched.begin();
-    for (const boost::shared_ptr<ICIMInstance>& instance : instances) {
-        if (matched != fMatched.end() && *matched == instance) {
-            fEngine.ReadKey(*fRules, *instance);
-            ++matched;
-        } else {
-            fEngine.EnterInstance(fRules, instance, place);
         }
     }
 }

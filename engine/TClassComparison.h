@@ -29,7 +29,6 @@ class TCIMDiffEngine::TClassComparison {
     void RecordAbsentInstances(bool excludesKeys);
     void RecordAbsentInstance(const std::string& key, const ICIMInstance& instance, const TIndices& indices, bool excludesKeys);
     void RecordMissingInstances();
-    void CollectMissingInstances(std::map<std::string, TMasterInstance>& others);
     void RecordDifferences();
     void CopyToReference(boost::shared_ptr<ICIMInstance> instance);
     bool HasTwoNamespaces() const;
@@ -44,7 +43,6 @@ class TCIMDiffEngine::TClassComparison {
     std::map<std::string, TIndices> fAbsent;   // by key, the namespaces that lack the instance
     std::map<std::string, TIndices> fMissing;  // by key, the namespaces whose instance the reference lacks
     std::map<std::string, std::map<std::string, TIndices>> fDifferences;  // by key and property
-    std::vector<boost::shared_ptr<ICIMInstance>> fMatched;  // of two namespaces: the other's, in the order of the enumeration
     boost::shared_ptr<ICIMInstance> fClassRecord;
 };
 

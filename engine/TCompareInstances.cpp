@@ -25,7 +25,7 @@ bool TCIMDiffEngine::TCompareInstances::operator()(boost::shared_ptr<ICIMInstanc
 {
     // A walk of one step: it has no place from before.
     TInstanceWalk::TState state{TMapCursor<std::map<std::string, TMasterInstance>>(*fMasterMap),
-                                TMapCursor<std::map<std::string, std::vector<int>>>(*fMissingMap), nullptr};
+                                TMapCursor<std::map<std::string, std::vector<int>>>(*fMissingMap)};
     return TInstanceWalk(*this, &state)(std::move(instance));
 }
 

@@ -8,9 +8,6 @@ bool TCIMDiffEngine::TInstanceWalk::operator()(boost::shared_ptr<ICIMInstance> i
 {
     std::string key = BuildKey(instance);
     if (auto* const master = fState->masters.Find(key)) {
-        if (fState->matched != nullptr) {
-            fState->matched->push_back(instance);
-        }
         Match(master->second, std::move(key), std::move(instance));
         return true;
     }

@@ -15,7 +15,6 @@ class TCIMDiffEngine::TInstanceWalk : public TCompareInstances {
     struct TState {
         TMapCursor<std::map<std::string, TMasterInstance>> masters;
         TMapCursor<std::map<std::string, std::vector<int>>> missing;
-        std::vector<boost::shared_ptr<ICIMInstance>>* matched;  ///< the instances whose key the reference has; null: not wanted
     };
 
     TInstanceWalk(const TCompareInstances& compareInstances, TState* state) : TCompareInstances(compareInstances), fState(state) {}
