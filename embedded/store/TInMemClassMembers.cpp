@@ -78,7 +78,7 @@ boost::shared_ptr<ICIMPropertyDecl> TInMemClass::GetPropertyDecl(const std::stri
     return decl;
 }
 
-/// The order is copied here and below, because the callback may add or remove properties.
+/// The order is copied, because the callback may add or remove properties.
 void TInMemClass::EnumeratePropertyDecls(const boost::function<bool(boost::shared_ptr<ICIMPropertyDecl>)>& callback,
                                          TCallContext) const
 {
@@ -92,7 +92,8 @@ void TInMemClass::EnumeratePropertyDecls(const boost::function<bool(boost::share
 
 void TInMemClass::EnumerateKeyNames(const boost::function<bool(const std::string*)>& callback, TCallContext) const
 {
-    // The loop goes by position, because the callback may change the class.
+    // Not copied, since this is asked for with every key text. The loop goes by position, so a callback that changes the class does
+    // no harm, but it may miss a key.
     for (std::size_t at = 0; at < fLayout.GetKeys().size(); ++at) {
         if (!callback(&fLayout.GetDecl(fLayout.GetKeys()[at]).GetName())) {
             return;

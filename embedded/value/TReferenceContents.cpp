@@ -2,7 +2,8 @@
 // few paths that ended, with the memory of their bindings.
 //
 // The list of spares needs no destructor, so paths may end at any moment of a thread, also after its other thread-local objects.
-// A separate object frees the spares when the thread ends; from then on none are kept.
+// A separate object frees the spares when the thread ends; from then on none are kept. If the first path
+// of a thread ends that late, its contents are not freed.
 
 #include "embedded/value/TReferenceContents.h"
 
