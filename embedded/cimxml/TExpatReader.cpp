@@ -2,6 +2,7 @@
 //
 // Pieces. Bytes may be handed over in pieces of any length, which may end within a tag or a character. Expat keeps what it has not
 // finished and delivers character data in pieces too; the reader gathers those and hands the text over whole, before the next tag.
+// Expat copies each piece as a whole, so the reader cuts long ones.
 //
 // Entities. Expat expands internal entities itself and bounds how much they may amplify the input. It does not see two things: how
 // long attribute defaults become when they are handed out for every element, and how deep expansion recurses on the stack. So the
@@ -163,7 +164,7 @@ void TExpatReader::Reset(const char* encoding, const TXmlProgress& progress)
     Install();  // from here on, events go to the sink
     fText = progress.text;
     fDepth = progress.depth;
-    fBytes = tags.size();
+    fBytes = fReceived = tags.size();
     fLinesBefore = progress.place.line - 1;
     // Of the first line, the library knows only what follows on the tags.
     fColumnsBefore = progress.place.column - 1 - tags.size();
@@ -185,30 +186,52 @@ const char* TExpatReader::FindExcess(const char** attributes)
         return "too many attributes";
     }
     if (count > specified && fDefaultBytes > TXmlLimits::kExpansionThreshold &&
-        static_cast<double>(fDefaultBytes) > TXmlLimits::kMaxAmplification * static_cast<double>(fBytes)) {
+        static_cast<double>(fDefaultBytes) > TXmlLimits::kMaxAmplification * static_cast<double>(fReceived)) {
         return "attribute defaults expand too much";
     }
     return nullptr;
 }
 
-/// Expat takes lengths as int, so longer text is parsed in pieces.
 bool TExpatReader::Parse(const char* data, std::size_t length, bool last)
 {
-    while (!fStopped && (length > 0 || last)) {
-        // Half of the range leaves the library room for what it kept of the piece before.
-        const std::size_t piece = std::min<std::size_t>(length, INT_MAX / 2);
-        const bool final = last && piece == length;
-        fBytes += piece;
-        if (!Settle(XML_Parse(fParser.get(), data, static_cast<int>(piece), final) != XML_STATUS_ERROR)) {
+    std::string_view rest(data, length);
+    fReceived += length;
+    while (!fStopped && !rest.empty()) {
+        const std::string_view piece = rest.substr(0, GetPieceLength(rest));
+        rest.remove_prefix(piece.size());
+        if (!ParsePiece(piece, last && rest.empty())) {
             return false;
         }
-        if (final) {
-            break;
-        }
-        data += piece;
-        length -= piece;
     }
-    return fError.empty();
+    if (length == 0 && last && !fStopped && !ParsePiece(rest, true)) {
+        return false;
+    }
+    return CheckPending();
+}
+
+/// How much of the text the library gets at once. A tag that has not ended is read again with each piece; pieces as long as that
+/// tag keep the total linear. The library's buffer grows by doubling, so the rest of a long tag goes at once. No piece ends within
+/// a line end: behind the outermost element, the library would count two.
+std::size_t TExpatReader::GetPieceLength(std::string_view text) const
+{
+    using namespace std::string_view_literals;
+    constexpr std::size_t kShortest = 64 * 1024;
+    constexpr std::size_t kLong = 1024 * 1024;
+    const std::size_t pending = GetPending() / 2 * 2;  // even: characters of UTF-16 stay whole
+    const std::size_t length = std::max(pending, pending < kLong ? kShortest : TXmlLimits::kMaxTokenLength);
+    for (const std::string_view lineEnd : {"\r\n"sv, "\r\0\n\0"sv, "\0\r\0\n"sv}) {
+        const std::size_t half = lineEnd.size() / 2;
+        if (length < text.size() && text.substr(length - half, lineEnd.size()) == lineEnd) {
+            return length + half;
+        }
+    }
+    return std::min(length, text.size());
+}
+
+bool TExpatReader::ParsePiece(std::string_view piece, bool last)
+{
+    fBytes += piece.size();
+    return Settle(XML_Parse(fParser.get(), piece.data(), static_cast<int>(piece.size()), last) != XML_STATUS_ERROR);
 }
 
 char* TExpatReader::GetBuffer(std::size_t length)
@@ -226,10 +249,11 @@ bool TExpatReader::ParseBuffer(std::size_t length)
         return fError.empty();
     }
     fBytes += length;
-    return Settle(XML_ParseBuffer(fParser.get(), static_cast<int>(length), XML_FALSE) != XML_STATUS_ERROR);
+    fReceived += length;
+    return Settle(XML_ParseBuffer(fParser.get(), static_cast<int>(length), XML_FALSE) != XML_STATUS_ERROR) && CheckPending();
 }
 
-/// Checks what a call of the library has left: a stopped parse, an error of the library, or a tag that is too long already.
+/// Checks what a call of the library has left: a stopped parse or an error of the library.
 bool TExpatReader::Settle(bool succeeded)
 {
     if (fException) {
@@ -247,7 +271,13 @@ bool TExpatReader::Settle(bool succeeded)
         Refuse(XML_ErrorString(code));
         return false;
     }
-    if (GetPending() > TXmlLimits::kMaxTokenLength) {
+    return true;
+}
+
+/// Checks what the bytes of the caller have left: a tag that is too long already.
+bool TExpatReader::CheckPending()
+{
+    if (!fStopped && GetPending() > TXmlLimits::kMaxTokenLength) {
         Refuse("a tag is too long");
     }
     return fError.empty();

@@ -4,6 +4,7 @@
 #include <exception>
 #include <memory>
 #include <string>
+#include <string_view>
 
 #include "embedded/cimxml/IXmlSink.h"
 #include "embedded/cimxml/TXmlPlace.h"
@@ -46,7 +47,10 @@ class TExpatReader {
     };
 
     void Install();
+    std::size_t GetPieceLength(std::string_view text) const;
+    bool ParsePiece(std::string_view piece, bool last);
     bool Settle(bool succeeded);
+    bool CheckPending();
     void Refuse(const char* reason);
     const char* FindExcess(const char** attributes);
     void HandOverText();
@@ -56,7 +60,8 @@ class TExpatReader {
     std::string fText;
     std::size_t fDepth = 0;
     std::size_t fEntities = 0;
-    std::size_t fBytes = 0;
+    std::size_t fBytes = 0;          // that the library has
+    std::size_t fReceived = 0;       // that this reader has
     std::size_t fDefaultBytes = 0;   // of attributes that an element leaves out and the document type declares
     std::size_t fLinesBefore = 0;    // in front of the library's first line
     std::size_t fColumnsBefore = 0;  // in front of its first column; wraps around below 0

@@ -44,8 +44,7 @@ bool TXmlReader::Parse(const char* data, std::size_t length, bool last)
     return fIsTokenizing ? ParseFromMemory(data, length, last) : fExpat->Parse(data, length, last);
 }
 
-/// The tokenizer gets the bytes in slices that stay in the processor's cache. If it leaves a token to Expat, that reads on in
-/// `data`.
+/// The tokenizer gets the bytes in slices that stay in the processor's cache.
 bool TXmlReader::ParseFromMemory(const char* data, std::size_t length, bool last)
 {
     constexpr std::size_t kSlice = 64 * 1024;
@@ -57,18 +56,9 @@ bool TXmlReader::ParseFromMemory(const char* data, std::size_t length, bool last
             std::memcpy(room, data + done, slice);
         }
         done += slice;
-        if (fIsStopped || Scan(slice, last && done == length)) {
-            continue;
+        if (!fIsStopped && !Scan(slice, last && done == length)) {
+            return Leave(data, length, last, done);
         }
-        Leave();
-        const std::string_view rest = fTokenizer->GetRest();
-        const std::size_t earlier = rest.size() - std::min(rest.size(), done);
-        const std::size_t from = done - (rest.size() - earlier);
-        if (earlier > 0 && !fExpat->Parse(rest.data(), earlier, false)) {
-            return false;
-        }
-        fTokenizer->ReleaseMemory();
-        return fExpat->Parse(data + from, length - from, last);
     } while (done < length);
     return true;
 }
@@ -84,13 +74,21 @@ bool TXmlReader::Scan(std::size_t length, bool last)
     }
 }
 
-/// From now on Expat reads.
-void TXmlReader::Leave()
+/// From now on Expat reads: what the tokenizer has left of earlier bytes, then `data`, of which the tokenizer has had `done` bytes.
+bool TXmlReader::Leave(const char* data, std::size_t length, bool last, std::size_t done)
 {
     const TXmlProgress progress = fTokenizer->TakeProgress();
     // The tokenizer has accepted the beginning as UTF-8.
     fExpat->Reset(progress.tags.empty() ? fEncoding : "UTF-8", progress);
     fIsTokenizing = false;
+    const std::string_view rest = fTokenizer->GetRest();
+    const std::size_t earlier = rest.size() - std::min(rest.size(), done);
+    const std::size_t from = done - (rest.size() - earlier);
+    if (!fExpat->Parse(rest.data(), earlier, false)) {
+        return false;
+    }
+    fTokenizer->ReleaseMemory();
+    return fExpat->Parse(data + from, length - from, last);
 }
 
 char* TXmlReader::GetBuffer(std::size_t length)
@@ -103,14 +101,7 @@ bool TXmlReader::ParseBuffer(std::size_t length)
     if (!fIsTokenizing) {
         return fExpat->ParseBuffer(length);
     }
-    if (fIsStopped || Scan(length, false)) {
-        return true;
-    }
-    Leave();
-    const std::string_view rest = fTokenizer->GetRest();
-    const bool isParsed = fExpat->Parse(rest.data(), rest.size(), false);
-    fTokenizer->ReleaseMemory();
-    return isParsed;
+    return fIsStopped || Scan(length, false) || Leave("", 0, false, 0);
 }
 
 std::size_t TXmlReader::GetPending() const
@@ -118,6 +109,7 @@ std::size_t TXmlReader::GetPending() const
     return fIsTokenizing ? fTokenizer->GetRest().size() : fExpat->GetPending();
 }
 
+/// Ends the parse from within an event; the rest is ignored.
 void TXmlReader::Stop()
 {
     if (!fIsTokenizing) {

@@ -54,9 +54,6 @@ class CIMDELTA_INTERNAL_EXPORT TXmlReader {
     /// How many of the parsed bytes belong to a tag that has not ended yet.
     std::size_t GetPending() const;
 
-    /// Stops the parse, for calls from within an event; Parse then returns true and ignores the rest.
-    void Stop();
-
     /// Why the document is in error; empty if it is not.
     const std::string& GetError() const noexcept;
 
@@ -71,7 +68,8 @@ class CIMDELTA_INTERNAL_EXPORT TXmlReader {
   private:
     bool Scan(std::size_t length, bool last);
     bool ParseFromMemory(const char* data, std::size_t length, bool last);
-    void Leave();
+    bool Leave(const char* data, std::size_t length, bool last, std::size_t done);
+    void Stop();
 
     const EParser fParser;
     std::unique_ptr<TXmlTokenizer> fTokenizer;
