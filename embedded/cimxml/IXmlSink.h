@@ -11,8 +11,8 @@ class IXmlSink {
 
     /// `attributes` alternates names and values and ends with null.
     virtual void OnStart(const char* name, const char** attributes) = 0;
-    /// Called instead of OnStart for a tag that stands byte for byte the same elsewhere, as far as that is known. Equal tags have
-    /// the same number, in all documents of one reader. Numbers begin with 0 and stay below a few thousand.
+    /// Called instead of OnStart for a tag that the reader keeps. Tags that are the same byte for byte have the same number in all
+    /// documents of one reader. Numbers are below TXmlKnownTags::kMost.
     virtual void OnKnownStart(std::size_t, const char* name, const char** attributes) { OnStart(name, attributes); }
     virtual void OnEnd(const char* name) = 0;
     /// Called before a tag with the text between it and the tag before, unless that is empty. A NUL follows the text. The text

@@ -1,6 +1,12 @@
 // Tags that come again are known, and so is what they mean. What is known of one class must not be taken for another.
 #include <gtest/gtest.h>
 
+#include <map>
+#include <set>
+#include <string>
+
+#include "embedded/cimxml/TXmlKnownTags.h"
+#include "embedded/cimxml/TXmlReader.h"
 #include "tests/embedded/cimxml/ReadXml.h"
 #include "tests/embedded/cimxml/TLoading.h"
 
@@ -47,6 +53,53 @@ TEST(KnownTagsTest, AKnownPropertyMayStandInAnInstanceOnce)
     const std::string twice = L::Instance("A", "9", L::Property("N", "uint8", "1") + "\n" + L::Property("N", "uint8", "1"));
     EXPECT_EQ("doc.xml:8:1: found property \"N\" a second time in one instance",
               TLoading().ErrorOf(L::Group(kClasses + Instance("A", 1) + Instance("A", 2) + "\n" + twice)));
+}
+
+/// Writes down which number each tag comes with.
+class TNumberLog : public IXmlSink {
+  public:
+    void OnStart(const char*, const char** attributes) override
+    {
+        if (attributes[0] != nullptr) {
+            unnumbered.insert(attributes[1]);
+        }
+    }
+    void OnKnownStart(std::size_t number, const char* name, const char** attributes) override
+    {
+        numbers[std::string(name) + (attributes[0] != nullptr ? attributes[1] : "")].insert(number);
+    }
+    void OnEnd(const char*) override {}
+    void OnText(const char*, std::size_t) override {}
+
+    std::map<std::string, std::set<std::size_t>> numbers;  ///< of each tag, by its name and its attribute
+    std::set<std::string> unnumbered;                      ///< attributes of the tags without a number
+};
+
+/// Three documents with 6,000 different tags, each tag in two of them.
+TEST(KnownTagsTest, ATagHasOneNumberInAllDocumentsOfAReader)
+{
+    TNumberLog log;
+    TXmlReader reader(log);
+    for (int first : {0, 2000, 4000}) {
+        std::string document = "<a>";
+        for (int tag = first; tag < first + 4000; ++tag) {
+            document += "<b c='" + std::to_string(tag % 6000) + "'/>";
+        }
+        document += "</a>";
+        reader.Reset();
+        ASSERT_TRUE(reader.Parse(document.data(), document.size(), true));
+        ASSERT_FALSE(reader.HasLeftToExpat());
+    }
+    std::set<std::size_t> all;
+    for (const auto& [tag, numbers] : log.numbers) {
+        EXPECT_EQ(1u, numbers.size()) << tag;
+        all.insert(numbers.begin(), numbers.end());
+    }
+    EXPECT_EQ(TXmlKnownTags::kMost, log.numbers.size());
+    EXPECT_EQ(TXmlKnownTags::kMost, all.size());
+    EXPECT_EQ(0u, *all.begin());
+    EXPECT_EQ(TXmlKnownTags::kMost - 1, *all.rbegin());
+    EXPECT_EQ(6001 - TXmlKnownTags::kMost, log.unnumbered.size());
 }
 
 }  // namespace
