@@ -5,6 +5,7 @@
 #include <string_view>
 
 #include "embedded/cimxml/EXmlScan.h"
+#include "embedded/value/IsXmlCharacter.h"
 #include "embedded/value/TUtf8.h"
 
 namespace NORVZEL20 {
@@ -19,21 +20,12 @@ class TXmlCharacter {
     static bool IsNameStart(char c) noexcept { return (Get(c) & kNameStart) != 0; }
     static bool IsNamePart(char c) noexcept { return (Get(c) & kNamePart) != 0; }
 
-    /// Whether a document may contain the character with this code.
-    static bool IsAllowed(char32_t code) noexcept
-    {
-        if (code < ' ') {
-            return code == '\t' || code == '\n' || code == '\r';
-        }
-        return (code < 0xD800 || code > 0xDFFF) && code != 0xFFFE && code != 0xFFFF && code <= 0x10FFFF;
-    }
-
     /// Moves `at` over the UTF-8 character that begins there, unless the bytes end within it or a document may not contain it.
     static EXmlScan Pass(const char*& at, const char* end) noexcept
     {
         constexpr std::ptrdiff_t kLongest = 4;
         const TUtf8::TCharacter character = TUtf8::Decode(std::string_view(at, static_cast<std::size_t>(end - at)));
-        if (character.IsValid() && IsAllowed(character.code)) {
+        if (character.IsValid() && IsXmlCharacter(character.code)) {
             at += character.length;
             return EXmlScan::kAccepted;
         }

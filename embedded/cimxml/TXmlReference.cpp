@@ -2,7 +2,7 @@
 
 #include <string_view>
 
-#include "embedded/cimxml/TXmlCharacter.h"
+#include "embedded/value/IsXmlCharacter.h"
 
 namespace NORVZEL20 {
 
@@ -41,7 +41,7 @@ char32_t GetNumbered(std::string_view digits, unsigned int base)
         }
         code = code * base + digit;
     }
-    return code != 0 && TXmlCharacter::IsAllowed(code) ? code : kNoCharacter;
+    return code != 0 && IsXmlCharacter(code) ? code : kNoCharacter;
 }
 
 char32_t GetCharacter(std::string_view name)

@@ -2,6 +2,7 @@
 // copied, escaped, or replaced by U+FFFD if XML 1.0 does not allow it. The result can always be parsed, even if a value holds
 // arbitrary bytes.
 
+#include "embedded/value/IsXmlCharacter.h"
 #include "embedded/value/TUtf8.h"
 #include "embedded/value/TValueXml.h"
 
@@ -15,8 +16,7 @@ constexpr const char* kReplacement = "\xEF\xBF\xBD";
 std::size_t GetXmlLength(std::string_view text)
 {
     const TUtf8::TCharacter character = TUtf8::Decode(text);
-    const bool isForbidden = character.code == 0xFFFE || character.code == 0xFFFF;
-    return character.IsValid() && !isForbidden ? character.length : 0;
+    return character.IsValid() && IsXmlCharacter(character.code) ? character.length : 0;
 }
 
 /// Whether `c` is copied as it is, in attributes too.
