@@ -20,7 +20,7 @@ TCimXmlContext::~TCimXmlContext() = default;
 
 void TCimXmlContext::Fail(TZELStatusCode::EStatusCode status, const std::string& message) const
 {
-    const TPlace place = GetPlace();
+    const TXmlPlace place = GetPlace();
     throw TPopulateError(status, fEmbeddedDepth > 0 ? "in an embedded object: " + message : message, fFile, place.line,
                          place.column);
 }
@@ -34,13 +34,9 @@ void TCimXmlContext::EnterEmbeddedObject()
     ++fEmbeddedDepth;
 }
 
-TCimXmlContext::TPlace TCimXmlContext::GetPlace() const
+TXmlPlace TCimXmlContext::GetPlace() const
 {
-    if (fPlace.line > 0) {
-        return fPlace;
-    }
-    const TXmlPlace place = fReader->GetPlace();
-    return {place.line, place.column};
+    return fPlace ? *fPlace : fReader->GetPlace();
 }
 
 void TCimXmlContext::Tolerate(const char* kind, const std::string& text)

@@ -1,6 +1,7 @@
 #pragma once
 
 #include <cstddef>
+#include <optional>
 #include <string>
 #include <string_view>
 #include <utility>
@@ -10,6 +11,7 @@
 #include "embedded/cimxml/TLoadReport.h"
 #include "embedded/cimxml/TPopulateError.h"
 #include "embedded/cimxml/TTextPool.h"
+#include "embedded/cimxml/TXmlPlace.h"
 #include "embedded/cimxml/TXmlReader.h"
 #include "host/Export.h"
 
@@ -21,24 +23,21 @@ namespace NORVZEL20 {
 /// Threads: one at a time, as the load that it belongs to.
 class CIMDELTA_INTERNAL_EXPORT TCimXmlContext {
   public:
-    /// A place in the document, counted from 1.
-    struct TPlace {
-        std::size_t line = 0;
-        std::size_t column = 0;
-    };
-
     /// While it lives, errors and notes are reported at `place` instead of the position being read. It is for parts that were read
     /// earlier and are used only now. Objects may nest; the innermost counts.
     class TAt {
       public:
-        TAt(TCimXmlContext& context, const TPlace& place) : fContext(context), fEarlier(context.fPlace) { context.fPlace = place; }
+        TAt(TCimXmlContext& context, const TXmlPlace& place) : fContext(context), fEarlier(context.fPlace)
+        {
+            context.fPlace = place;
+        }
         TAt(const TAt&) = delete;
         TAt& operator=(const TAt&) = delete;
         ~TAt() { fContext.fPlace = fEarlier; }
 
       private:
         TCimXmlContext& fContext;
-        TPlace fEarlier;
+        std::optional<TXmlPlace> fEarlier;
     };
 
     /// `file` is what messages call the document, `embeddedDepth` how many embedded objects it stands in.
@@ -57,7 +56,7 @@ class CIMDELTA_INTERNAL_EXPORT TCimXmlContext {
     [[noreturn]] void Fail(TZELStatusCode::EStatusCode status, const std::string& message) const;
 
     /// The place of the innermost TAt, or else the position being read.
-    TPlace GetPlace() const;
+    TXmlPlace GetPlace() const;
 
     /// Notes in the report something odd that does not end the load. `kind` must be a string literal: the first call with it adds
     /// `text` and its place to the report, later ones are counted.
@@ -100,7 +99,7 @@ class CIMDELTA_INTERNAL_EXPORT TCimXmlContext {
   private:
     std::string fFile;
     const TXmlReader* fReader = nullptr;
-    TPlace fPlace;  // of the innermost TAt; line 0 if there is none
+    std::optional<TXmlPlace> fPlace;  // of the innermost TAt
     TLoadReport fReport;
     TCimXmlOwnPlace fOwnPlace{fReport};
     std::vector<const char*> fKinds;  // of the entries of fReport.tolerated

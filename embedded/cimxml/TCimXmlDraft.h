@@ -3,7 +3,7 @@
 #include <string>
 #include <vector>
 
-#include "embedded/cimxml/TCimXmlContext.h"
+#include "embedded/cimxml/TXmlPlace.h"
 #include "embedded/value/TEmbeddedObject.h"
 
 namespace NORVZEL20 {
@@ -11,8 +11,8 @@ namespace NORVZEL20 {
 /// A class or an instance as a document describes it, with its place there, until it can be added to a namespace.
 struct TCimXmlDraft {
     TEmbeddedObject object;
-    TCimXmlContext::TPlace place;
-    std::vector<TCimXmlContext::TPlace> propertyPlaces;      ///< in the order of the object's properties
+    TXmlPlace place;
+    std::vector<TXmlPlace> propertyPlaces;                   ///< in the order of the object's properties
     std::vector<std::pair<std::string, TCIMValue>> ownKeys;  ///< for an instance: the keys of the name in front of it
 };
 

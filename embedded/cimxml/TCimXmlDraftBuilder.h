@@ -6,6 +6,7 @@
 #include "embedded/cimxml/TCimXmlAttributes.h"
 #include "embedded/cimxml/TCimXmlContext.h"
 #include "embedded/cimxml/TCimXmlDraft.h"
+#include "embedded/cimxml/TXmlPlace.h"
 
 namespace NORVZEL20 {
 
@@ -42,7 +43,7 @@ class TCimXmlDraftBuilder {
     TCimXmlContext& fContext;
     std::optional<TCimXmlDraft> fDraft;
     std::optional<TEmbeddedObject::TProperty> fProperty;
-    TCimXmlContext::TPlace fPropertyPlace;
+    TXmlPlace fPropertyPlace;
     std::optional<TEmbeddedObject::TMethod> fMethod;
     std::optional<TEmbeddedObject::TParameter> fParameter;
 };

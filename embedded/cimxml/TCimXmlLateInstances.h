@@ -6,8 +6,9 @@
 #include <utility>
 #include <vector>
 
-#include "embedded/cimxml/TCimXmlContext.h"
 #include "embedded/cimxml/TCimXmlDraft.h"
+#include "embedded/cimxml/TCimXmlOwnPlace.h"
+#include "embedded/cimxml/TXmlPlace.h"
 #include "embedded/store/TInMemInstance.h"
 #include "embedded/store/TInMemNamespace.h"
 
@@ -20,7 +21,7 @@ class TCimXmlLateInstances {
     /// An instance that is filled but not added, with its place in the document.
     struct THeld {
         boost::shared_ptr<TInMemInstance> instance;
-        TCimXmlContext::TPlace place;
+        TXmlPlace place;
     };
 
     /// From now on all instances wait as drafts; called when the class of one is not declared yet.
@@ -29,10 +30,7 @@ class TCimXmlLateInstances {
     void Wait(TCimXmlDraft draft) { fDrafts.push_back(std::move(draft)); }
 
     /// Holds an instance back, because a reference in one of its keys is noted too.
-    void Hold(const boost::shared_ptr<TInMemInstance>& instance, const TCimXmlContext::TPlace& place)
-    {
-        fHeld.push_back({instance, place});
-    }
+    void Hold(const boost::shared_ptr<TInMemInstance>& instance, const TXmlPlace& place) { fHeld.push_back({instance, place}); }
 
     /// Notes a property with a reference that may have to be written again. `declared` is how many classes are declared.
     void NoteReference(const boost::shared_ptr<TInMemInstance>& instance, std::uint32_t slot, std::size_t declared)
