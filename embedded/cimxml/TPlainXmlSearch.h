@@ -9,6 +9,8 @@ namespace NORVZEL20 {
 struct TPlainXmlSearch {
     TPlainXmlSearch() = delete;
 
+    static constexpr std::size_t kReadsBeyond = 1;
+
     static const char* FindSpecial(const char* from, char delimiter) noexcept
     {
         for (;; ++from) {

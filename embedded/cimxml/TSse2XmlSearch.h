@@ -13,6 +13,8 @@ namespace NORVZEL20 {
 struct TSse2XmlSearch {
     TSse2XmlSearch() = delete;
 
+    static constexpr std::size_t kReadsBeyond = 16;
+
     static const char* FindSpecial(const char* from, char delimiter) noexcept
     {
         const __m128i less = _mm_set1_epi8('<');
@@ -68,7 +70,7 @@ struct TSse2XmlSearch {
     }
 
   private:
-    static constexpr std::size_t kStep = 16;
+    static constexpr std::size_t kStep = kReadsBeyond;
     static constexpr unsigned int kAll = 0xFFFF;
 
     static __m128i Load(const char* from) noexcept { return _mm_loadu_si128(reinterpret_cast<const __m128i*>(from)); }

@@ -2,16 +2,16 @@
 
 #include "embedded/cimxml/TXmlCharacter.h"
 #include "embedded/cimxml/TXmlReference.h"
+#include "embedded/cimxml/TXmlSearch.h"
 #include "embedded/value/TUtf8.h"
 
 namespace NORVZEL20 {
 
 void TXmlTag::Assign(const TXmlStartTag& tag)
 {
-    constexpr std::size_t kReadBeyond = 16;
     fBytes = tag.GetBytes();
     fLength = fBytes.size();
-    fBytes.append(kReadBeyond, '\0');
+    fBytes.append(TXmlSearch::kReadsBeyond, '\0');
     fText.clear();
     // No text is longer than in the tag, and its NUL takes the place of '=' or a quote. So nothing below moves the texts.
     fText.reserve(fLength);

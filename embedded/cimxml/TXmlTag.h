@@ -19,7 +19,7 @@ class TXmlTag {
     /// Takes over a tag that was accepted. Errors: std::bad_alloc.
     void Assign(const TXmlStartTag& tag);
 
-    /// The tag as the document writes it. 16 bytes behind it may be read.
+    /// The tag as the document writes it. TXmlSearch::kReadsBeyond bytes behind it may be read.
     std::string_view GetBytes() const noexcept { return std::string_view(fBytes.data(), fLength); }
     const char* GetName() const noexcept { return fText.data(); }
     std::size_t GetNameLength() const noexcept { return fNameLength; }

@@ -2,7 +2,11 @@
 
 #include <cstring>
 
+#include "embedded/cimxml/TXmlSearch.h"
+
 namespace NORVZEL20 {
+
+static_assert(TXmlWindow::kPad > TXmlSearch::kReadsBeyond, "a search stays in the buffer");
 
 void TXmlWindow::Reset() noexcept
 {

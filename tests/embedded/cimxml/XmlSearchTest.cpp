@@ -1,4 +1,4 @@
-// Both forms of the tokenizer's searches against the plainest words for what they find.
+// Both forms of the tokenizer's searches against the plainest loop.
 #include <gtest/gtest.h>
 
 #include <algorithm>
@@ -12,8 +12,6 @@
 namespace NORVZEL20 {
 namespace {
 
-constexpr std::size_t kBeyond = 16;  // bytes that a search may read too far
-
 /// A text of mostly plain characters with room behind it.
 std::string MakeText(std::mt19937& random, std::size_t length)
 {
@@ -22,7 +20,7 @@ std::string MakeText(std::mt19937& random, std::size_t length)
     while (text.size() < length) {
         text += random() % 8 == 0 ? kRare[random() % kRare.size()] : static_cast<char>(' ' + random() % 0x5F);
     }
-    return text + std::string(kBeyond + 1, '\0');
+    return text + std::string(TXmlSearch::kReadsBeyond + 1, '\0');
 }
 
 std::size_t FindSlowly(const std::string& text, std::size_t from, char delimiter)
@@ -49,7 +47,7 @@ std::size_t CountSlowly(const std::string& text, std::size_t from, std::size_t t
 template <class TSearch>
 class XmlSearchTest : public testing::Test {};
 
-// On a processor without SSE2 both are the same.
+// If the compiler may not use SSE2, both are the same.
 using TSearches = testing::Types<TPlainXmlSearch, TXmlSearch>;
 TYPED_TEST_SUITE(XmlSearchTest, TSearches);
 
@@ -81,7 +79,8 @@ TYPED_TEST(XmlSearchTest, EqualBytesAreTheSameAndOneOtherByteIsNot)
             EXPECT_FALSE(TypeParam::AreSame(text.data(), other.data(), length)) << at;
         }
     }
-    EXPECT_TRUE(TypeParam::AreSame(std::string(kBeyond, 'a').data(), std::string(kBeyond, 'b').data(), 0));
+    EXPECT_TRUE(TypeParam::AreSame(std::string(TXmlSearch::kReadsBeyond, 'a').data(),
+                                   std::string(TXmlSearch::kReadsBeyond, 'b').data(), 0));
 }
 
 TYPED_TEST(XmlSearchTest, LineEndsAreCountedAndPairsOnce)
