@@ -139,4 +139,9 @@ std::size_t TXmlReader::CountTokens() const noexcept
     return fTokenizer->CountTokens();
 }
 
+std::size_t TXmlReader::CountScanned() const noexcept
+{
+    return fTokenizer->CountScanned();
+}
+
 }  // namespace NORVZEL20

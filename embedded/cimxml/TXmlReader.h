@@ -62,6 +62,8 @@ class CIMDELTA_INTERNAL_EXPORT TXmlReader {
 
     /// How many tags, comments and declarations the tokenizer has read, since the reader was made.
     std::size_t CountTokens() const noexcept;
+    /// How many bytes the tokenizer has scanned, since the reader was made; repeated ones count each time.
+    std::size_t CountScanned() const noexcept;
     /// Whether Expat reads the document, or the last part of it.
     bool HasLeftToExpat() const noexcept { return !fIsTokenizing; }
 

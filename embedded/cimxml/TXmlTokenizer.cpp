@@ -67,6 +67,7 @@ void TXmlTokenizer::Reset() noexcept
     fText.clear();
     fEvent = nullptr;
     fProlog = 0;
+    fAwaited = 0;
     fHasBegun = false;
     fIsStopped = false;
 }
@@ -74,6 +75,10 @@ void TXmlTokenizer::Reset() noexcept
 TXmlTokenizer::EOutcome TXmlTokenizer::Scan(std::size_t length, bool last)
 {
     fWindow.Add(length);
+    if (IsWaiting(length) && !last) {
+        return EOutcome::kMore;
+    }
+    fScanned += GetUnread();
     fAt = fWindow.GetBegin() + fProlog;
     fRun = fAt;
     EXmlScan scan = fHasBegun ? EXmlScan::kAccepted : ScanProlog();
@@ -84,6 +89,13 @@ TXmlTokenizer::EOutcome TXmlTokenizer::Scan(std::size_t length, bool last)
         scan = ScanEpilog();
     }
     return fIsStopped ? EOutcome::kDone : Pause(scan, last);
+}
+
+/// Whether a token that was cut off cannot have ended in the last `length` bytes. It is scanned from its beginning, so without a
+/// '>' that comes only when the window has twice as much of it: the total stays linear.
+bool TXmlTokenizer::IsWaiting(std::size_t length) noexcept
+{
+    return GetUnread() < fAwaited && std::memchr(fWindow.GetEnd() - length, '>', length) == nullptr;
 }
 
 /// Decides how it goes on, and makes the window forget what has been read.
@@ -99,6 +111,7 @@ TXmlTokenizer::EOutcome TXmlTokenizer::Pause(EXmlScan scan, bool last)
     if (scan == EXmlScan::kRefused || (last && scan == EXmlScan::kCutOff) || fWindow.GetLength() > kLongestToken) {
         return EOutcome::kLeave;
     }
+    fAwaited = 2 * GetUnread();
     return last ? EOutcome::kDone : EOutcome::kMore;
 }
 

@@ -54,6 +54,8 @@ class TXmlTokenizer {
 
     /// How many tags, comments and declarations were read, since the tokenizer was made.
     std::size_t CountTokens() const noexcept { return fTokens; }
+    /// How many bytes were scanned, since the tokenizer was made: those of a token that was cut off count each time.
+    std::size_t CountScanned() const noexcept { return fScanned; }
 
   private:
     EXmlScan ScanProlog();
@@ -68,6 +70,8 @@ class TXmlTokenizer {
     EXmlScan ScanStartTag();
     EXmlScan ScanEndTag();
     EXmlScan ScanComment();
+    std::size_t GetUnread() const noexcept { return fWindow.GetLength() - fProlog; }
+    bool IsWaiting(std::size_t length) noexcept;
     EOutcome Pause(EXmlScan scan, bool last);
 
     EXmlScan SkipBlanks() noexcept;
@@ -86,12 +90,14 @@ class TXmlTokenizer {
     TXmlWindow fWindow;
     TXmlKnownTags fTags;
     TXmlOpenElements fOpen;
-    std::string fText;        // in front of fRun, if it is not all in the window
-    char* fRun = nullptr;     // from here to fAt, the text is in the window as it means
-    char* fAt = nullptr;      // what has been read ends here
-    char* fEvent = nullptr;   // null if there is none
-    std::size_t fProlog = 0;  // bytes of it that have been read
+    std::string fText;         // in front of fRun, if it is not all in the window
+    char* fRun = nullptr;      // from here to fAt, the text is in the window as it means
+    char* fAt = nullptr;       // what has been read ends here
+    char* fEvent = nullptr;    // null if there is none
+    std::size_t fProlog = 0;   // bytes of it that have been read
+    std::size_t fAwaited = 0;  // unread bytes from which on the next token is scanned again
     std::size_t fTokens = 0;
+    std::size_t fScanned = 0;
     bool fHasBegun = false;  // the outermost element
     bool fIsStopped = false;
 };

@@ -1,4 +1,4 @@
-// Sources that deliver little at a time: the number of bytes that the XML library scans stays linear in the document's length.
+// Sources that deliver little at a time: the number of bytes that are scanned stays linear in the document's length.
 #include <gmock/gmock.h>
 
 #include <algorithm>
@@ -6,6 +6,7 @@
 #include <stdexcept>
 
 #include "embedded/cimxml/TCimXmlPopulator.h"
+#include "embedded/cimxml/TXmlReader.h"
 #include "fuzz/SampleInventory.h"
 #include "tests/hostile/DocumentParts.h"
 #include "tests/hostile/TGeneratedText.h"
@@ -57,6 +58,15 @@ class SlowSourceTest : public testing::Test {
     std::size_t fCallsAfterEnd = 0;
 };
 
+/// Counts the events.
+struct TCountingSink : IXmlSink {
+    void OnStart(const char*, const char**) override { ++events; }
+    void OnEnd(const char*) override { ++events; }
+    void OnText(const char*, std::size_t) override { ++events; }
+
+    std::size_t events = 0;
+};
+
 /// A document with one part that can be as long as a test likes.
 struct TLongRow {
     const char* name;
@@ -101,6 +111,42 @@ TEST_F(SlowSourceTest, WhatGoesOnIsNotBegunAnewForEachPiece)
             EXPECT_LE(fGiven, fLength);
             EXPECT_LE(fScanned, 4 * fLength);
             EXPECT_LE(fTotal, 12 * fLength + kMegabyte);  // buffers double, and the old one is copied
+        }
+    }
+}
+
+/// The tokenizer scans a token that is cut off again, but only when it may have ended or much more of it has come.
+TEST(SlowPiecesTest, TheTokenizerScansEachByteAFewTimes)
+{
+    const std::string part(60 * 1024, 'x');
+    std::string blanks = part;
+    std::replace(blanks.begin(), blanks.end(), 'x', ' ');
+    const struct {
+        const char* name;
+        std::string document;
+        std::size_t events;
+    } rows[] = {
+        {"a comment", "<a><!--" + part + "--></a>", 2},
+        {"a comment before the document", "<!--" + part.substr(0, 30000) + "--><!--" + part.substr(0, 30000) + "--><a/>", 2},
+        {"a comment behind the document", "<a/><!--" + part + "-->", 2},
+        {"an attribute", "<a><b c='" + part + "'/></a>", 4},
+        {"blanks in a tag", "<a><b" + blanks + "></b" + blanks + "></a>", 4},
+        {"a text", "<a>" + part + "</a>", 3},
+        {"short tokens", "<a>" + Repeat("<b c='1'>x</b>", 4000) + "</a>", 12002},
+    };
+    for (const auto& row : rows) {
+        for (const std::size_t piece : {1, 7, 100, 10000}) {
+            SCOPED_TRACE(row.name + (" in pieces of " + std::to_string(piece)));
+            TCountingSink sink;
+            TXmlReader reader(sink);
+            for (std::size_t at = 0; at < row.document.size(); at += piece) {
+                ASSERT_TRUE(reader.Parse(row.document.data() + at, std::min(piece, row.document.size() - at)));
+            }
+            EXPECT_TRUE(reader.Finish());
+            EXPECT_FALSE(reader.HasLeftToExpat());
+            EXPECT_EQ(row.events, sink.events);
+            EXPECT_GE(reader.CountScanned(), row.document.size());
+            EXPECT_LE(reader.CountScanned(), 4 * row.document.size());
         }
     }
 }
