@@ -12,12 +12,16 @@ constexpr char32_t kNoCharacter = 0;
 
 char32_t GetNamed(std::string_view name)
 {
-    return name == "lt"     ? U'<'
-           : name == "gt"   ? U'>'
-           : name == "amp"  ? U'&'
-           : name == "quot" ? U'"'
-           : name == "apos" ? U'\''
-                            : kNoCharacter;
+    constexpr struct {
+        std::string_view name;
+        char32_t code;
+    } kNamed[] = {{"lt", U'<'}, {"gt", U'>'}, {"amp", U'&'}, {"quot", U'"'}, {"apos", U'\''}};
+    for (const auto& named : kNamed) {
+        if (named.name == name) {
+            return named.code;
+        }
+    }
+    return kNoCharacter;
 }
 
 /// The value of a digit; 16 if it is none.
@@ -56,13 +60,13 @@ char32_t GetCharacter(std::string_view name)
 
 TXmlReference TXmlReference::Read(const char* from, const char* end) noexcept
 {
-    constexpr std::size_t kLongest = 10;  // "&#1114111;"
+    constexpr std::size_t kLongest = 10;  // "&#1114111;" and "&#x10FFFF;"
     std::size_t length = 1;
     for (; from[length] != ';'; ++length) {
         if (from + length == end) {
             return {EXmlScan::kCutOff, kNoCharacter, 0};
         }
-        if (length == kLongest) {
+        if (length + 1 == kLongest) {
             return {EXmlScan::kRefused, kNoCharacter, 0};
         }
     }

@@ -125,12 +125,15 @@ EXmlScan TXmlTokenizer::ScanProlog()
             return scan;
         }
         fTokens += at > fAt ? 1 : 0;
-        fAt += at - fAt;
+        MoveTo(at);
     }
     while (!fHasBegun) {
         EXmlScan scan = SkipBlanks();
+        if (scan == EXmlScan::kAccepted && fAt == fWindow.GetEnd()) {
+            scan = EXmlScan::kCutOff;
+        }
         if (scan == EXmlScan::kAccepted) {
-            scan = fAt == fWindow.GetEnd() ? EXmlScan::kCutOff : fAt[1] == '/' ? EXmlScan::kRefused : ScanMarkup();
+            scan = fAt[1] == '/' ? EXmlScan::kRefused : ScanMarkup();
         }
         if (scan != EXmlScan::kAccepted) {
             return scan;

@@ -75,6 +75,7 @@ class TXmlTokenizer {
     EOutcome Pause(EXmlScan scan, bool last);
 
     EXmlScan SkipBlanks() noexcept;
+    // The searches return constant pointers. The step turns them into pointers into the window, which may be written to.
     void MoveTo(const char* to) noexcept { fAt += to - fAt; }
     void BeginEvent();
     void Start(TXmlKnownTags::TKnown& known);
@@ -90,8 +91,8 @@ class TXmlTokenizer {
     TXmlWindow fWindow;
     TXmlKnownTags fTags;
     TXmlOpenElements fOpen;
-    std::string fText;         // in front of fRun, if it is not all in the window
-    char* fRun = nullptr;      // from here to fAt, the text is in the window as it means
+    std::string fText;         // the text in front of fRun; empty if the window has all of it
+    char* fRun = nullptr;      // the bytes from here to fAt are the text itself
     char* fAt = nullptr;       // what has been read ends here
     char* fEvent = nullptr;    // null if there is none
     std::size_t fProlog = 0;   // bytes of it that have been read

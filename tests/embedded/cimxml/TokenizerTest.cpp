@@ -102,7 +102,8 @@ TEST(TokenizerTest, EveryFileReadsTheSameWholeAndInPieces)
 std::vector<std::string> MakeSeeds()
 {
     std::vector<std::string> seeds = {
-        "<?xml version=\"1.0\" encoding=\"UTF-8\"?>\n<a>\n <b x=\"1\" y='2'>t</b>\n <b x=\"1\" y='2'>t</b><c z='>'/><c z='>'/></a>\n",
+        "<?xml version=\"1.0\" encoding=\"UTF-8\"?>\n<a>\n <b x=\"1\" y='2'>t</b>\n <b x=\"1\" y='2'>t</b><c z='>'/><c "
+        "z='>'/></a>\n",
         "<a b='&lt;&#65;\r\n\t'>x&amp;y\r\nz\r<!-- c --> ]] \xE2\x82\xAC\n<b/>&#x20AC;</a>\r\n<!-- d -->\r\n",
         "<!-- \xC3\xBC -->\r\n<a><b><c><d>text</d ></c\n></b><b><c><d>text</d></c></b></a>",
         "<?xml version='1.0'?><a.b:c-d_e><VALUE>1</VALUE><VALUE>1</VALUE><VALUE></VALUE></a.b:c-d_e> ",
@@ -198,6 +199,8 @@ TEST(TokenizerTest, EachKindOfTokenIsReadOrLeftToExpat)
         {"a reference to a surrogate", "<a>&#xD800;</a>", 1, true},
         {"a reference to no character", "<a>&#xFFFE;</a>", 1, true},
         {"a reference beyond Unicode", "<a>&#x110000;</a>", 1, true},
+        {"the longest references", "<a>&#0000065;&#1114111;&#x10FFFF;</a>", 2, false},
+        {"a reference that is longer", "<a>&#00000065;</a>", 1, true},
         {"a long reference", "<a>&#00000000065;</a>", 1, true},
         {"a reference with a wrong digit", "<a>&#6A;</a>", 1, true},
         {"a reference in capitals", "<a>&#X41;</a>", 1, true},
