@@ -18,8 +18,10 @@ class IXmlSink {
     /// Called before a tag with the text between it and the tag before, unless that is empty. A NUL follows the text. The text
     /// stays valid until the tag's own event returns.
     virtual void OnText(const char* text, std::size_t length) = 0;
-    virtual void OnProcessingInstruction(const char*, const char*) {}
-    virtual void OnNotation(const char*, const char*, const char*) {}
+    /// The instruction's target, and what follows behind the blanks; empty if nothing does.
+    virtual void OnProcessingInstruction(const char* /*target*/, const char* /*data*/) {}
+    /// A notation that the document type declares. One of the two identifiers may be null.
+    virtual void OnNotation(const char* /*name*/, const char* /*publicId*/, const char* /*systemId*/) {}
 };
 
 }  // namespace NORVZEL20

@@ -37,8 +37,8 @@ class TCimXmlInstanceBuilder {
     bool Begin(const char* className);
     /// Errors: kNotFound (15) if the class has no such property, kParseError (9) if the instance has had it already.
     TCimXmlTarget FindProperty(const char* name);
-    /// As FindProperty, for the property that is likely to come next. Returns false if the tag with that number is not the last one
-    /// that was noted for it, or the instance has had the property already.
+    /// As FindProperty, for the property that is likely to come next. Returns false if the property did not note that tag last
+    /// time, or if the instance has the property already; `target` is then meaningless.
     bool TakeLikely(std::size_t tagNumber, TCimXmlTarget& target) noexcept;
     /// What is noted of the tag of a property, in instances of the same class.
     TCimXmlLayout::TTag& GetTag(const TCimXmlTarget& target) noexcept { return fLayout->tags[target.slot]; }

@@ -4,8 +4,10 @@
 // element which state comes next and which action to do; when it ends, the state alone says the action. The actions put together:
 //
 //     object paths             TCimXmlPathReader
-//     values                   TCimXmlItem (of a property, which TCimXmlPropertyReader reads, or of a qualifier:
-//     TCimXmlQualifierReader) embedded objects         TCimXmlObjectReader, which runs another reader over the value's text
+//     properties               TCimXmlPropertyReader
+//     qualifiers               TCimXmlQualifierReader
+//     values of both           TCimXmlItem
+//     embedded objects         TCimXmlObjectReader, which runs another reader over the value's text
 //     classes, instances       TCimXmlDraftBuilder
 //
 // What is complete goes to the loader. There is a short cut for what inventories are made of: an instance whose class is declared

@@ -14,7 +14,7 @@ namespace NORVZEL20 {
 /// Makes string values and lets values of the same text share it, as far as that is cheap.
 ///
 /// The pool keeps a bounded number of texts and does not promise to share. Text that does not repeat replaces nothing in it; it
-/// goes into a TTextRun together with its neighbours. Values live as long as they like, with pool or without.
+/// goes into a TTextRun together with its neighbours. Values may outlive the pool.
 /// Threads: one at a time. Errors: std::bad_alloc.
 class CIMDELTA_INTERNAL_EXPORT TTextPool {
   public:

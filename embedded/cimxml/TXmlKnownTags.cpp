@@ -51,7 +51,7 @@ TXmlKnownTags::TKnown* TXmlKnownTags::Guess(const char* from, const char* end) c
     return isThere(afterOne) ? afterOne : nullptr;
 }
 
-/// Misses a tag with a '>' in a value: its beginning up to there is not known.
+/// Does not find a tag with a '>' in a value, because it looks only up to the first one.
 TXmlKnownTags::TKnown* TXmlKnownTags::Find(const char* from, const char* end) const
 {
     const std::size_t length = std::min<std::size_t>(static_cast<std::size_t>(end - from), kLongest);

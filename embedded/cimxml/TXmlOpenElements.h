@@ -19,8 +19,8 @@ class TXmlOpenElements {
     bool IsEmpty() const noexcept { return fOpen.empty(); }
     std::size_t GetDepth() const noexcept { return fOpen.size(); }
 
-    /// `name` must end with a NUL that its length does not count. Unless it `isLasting`, it is copied; otherwise it must live until
-    /// the element ends. Errors: std::bad_alloc.
+    /// `name` must end with a NUL that its length does not count. If `isLasting`, the name must live until the element ends;
+    /// otherwise it is copied. Errors: std::bad_alloc.
     void Push(const char* name, std::size_t length, bool isLasting)
     {
         fOpen.push_back(

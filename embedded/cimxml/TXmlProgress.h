@@ -9,7 +9,7 @@ namespace NORVZEL20 {
 
 /// How far a document has been read: what another parser needs to go on from there.
 struct TXmlProgress {
-    std::string tags;       ///< tags that bring a parser to the same depth: of the open elements, or of an element that has ended
+    std::string tags;       ///< start tags of the open elements; `<a/>` if the outermost one has ended
     std::size_t depth = 0;  ///< open elements
     std::string text;       ///< since the last tag
     TXmlPlace place;        ///< of the next byte

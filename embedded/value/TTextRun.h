@@ -1,6 +1,7 @@
 #pragma once
 
 #include <boost/smart_ptr/intrusive_ptr.hpp>
+#include <cstddef>
 #include <cstdint>
 #include <string_view>
 
@@ -19,6 +20,7 @@ class CIMDELTA_INTERNAL_EXPORT TTextRun : public TCounted {
 
     // Large enough that head and tail cost each text about a byte, small enough that a single value does not keep much alive.
     static constexpr std::size_t kSize = 4080;  // a page, less what the allocator adds
+    /// Bytes of a text. A longer one might leave much of a run empty.
     static constexpr std::size_t kLongestText = 512;
 
     /// An empty run. Errors: std::bad_alloc.
