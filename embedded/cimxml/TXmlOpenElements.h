@@ -32,7 +32,9 @@ class TXmlOpenElements {
     /// Ends the innermost element.
     void Pop()
     {
-        fCopies.resize(fOpen.back().copied);
+        if (fOpen.back().name == nullptr) {
+            fCopies.resize(fOpen.back().copied);
+        }
         fOpen.pop_back();
     }
 

@@ -3,6 +3,7 @@
 #include <string_view>
 
 #include "embedded/value/IsXmlCharacter.h"
+#include "embedded/value/TNameText.h"
 
 namespace NORVZEL20 {
 
@@ -17,7 +18,7 @@ char32_t GetNamed(std::string_view name)
         char32_t code;
     } kNamed[] = {{"lt", U'<'}, {"gt", U'>'}, {"amp", U'&'}, {"quot", U'"'}, {"apos", U'\''}};
     for (const auto& named : kNamed) {
-        if (named.name == name) {
+        if (TNameText::HasSameSpelling(named.name, name)) {
             return named.code;
         }
     }
@@ -50,10 +51,11 @@ char32_t GetNumbered(std::string_view digits, unsigned int base)
 
 char32_t GetCharacter(std::string_view name)
 {
-    if (name.substr(0, 2) == "#x") {
-        return GetNumbered(name.substr(2), 16);
+    if (name.empty() || name.front() != '#') {
+        return GetNamed(name);
     }
-    return name.substr(0, 1) == "#" ? GetNumbered(name.substr(1), 10) : GetNamed(name);
+    const bool isHexadecimal = name.size() > 1 && name[1] == 'x';
+    return isHexadecimal ? GetNumbered(name.substr(2), 16) : GetNumbered(name.substr(1), 10);
 }
 
 }  // namespace

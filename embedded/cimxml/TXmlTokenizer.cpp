@@ -14,7 +14,6 @@
 // '<'.
 #include "embedded/cimxml/TXmlTokenizer.h"
 
-#include <cstring>
 #include <string_view>
 #include <utility>
 
@@ -22,6 +21,7 @@
 #include "embedded/cimxml/TXmlDeclaration.h"
 #include "embedded/cimxml/TXmlReference.h"
 #include "embedded/cimxml/TXmlSearch.h"
+#include "embedded/value/TNameText.h"
 #include "embedded/value/TUtf8.h"
 
 namespace NORVZEL20 {
@@ -177,13 +177,12 @@ EXmlScan TXmlTokenizer::ScanEpilog()
 EXmlScan TXmlTokenizer::ScanText()
 {
     EXmlScan scan = EXmlScan::kAccepted;
-    do {
+    // Between two tags, there is mostly nothing or one line feed.
+    fAt += *fAt == '\n' ? 1 : 0;
+    while (*fAt != '<' && scan == EXmlScan::kAccepted) {
         MoveTo(TXmlSearch::FindSpecial(fAt, ']'));
-        if (*fAt == '<') {
-            break;
-        }
-        scan = ScanSpecial();
-    } while (scan == EXmlScan::kAccepted);
+        scan = *fAt != '<' ? ScanSpecial() : EXmlScan::kAccepted;
+    }
     return GetTextLength() > kLongestText ? RefuseText() : scan;
 }
 
@@ -312,7 +311,7 @@ EXmlScan TXmlTokenizer::ScanEndTag()
     if (static_cast<std::size_t>(fWindow.GetEnd() - fAt) <= kBegin + name.size()) {
         return EXmlScan::kCutOff;
     }
-    if (std::memcmp(fAt + kBegin, name.data(), name.size()) != 0) {
+    if (!TNameText::HasSameSpelling(std::string_view(fAt + kBegin, name.size()), name)) {
         return EXmlScan::kRefused;
     }
     char* close = fAt + kBegin + name.size();

@@ -79,7 +79,7 @@ class TXmlTokenizer {
     void MoveTo(const char* to) noexcept { fAt += to - fAt; }
     void BeginEvent();
     void Start(TXmlKnownTags::TKnown& known);
-    void Gather() { fText.append(fRun, fAt); }
+    void Gather() { fText.append(fRun, static_cast<std::size_t>(fAt - fRun)); }
     std::size_t GetTextLength() const noexcept { return fText.size() + static_cast<std::size_t>(fAt - fRun); }
     EXmlScan RefuseText() noexcept
     {

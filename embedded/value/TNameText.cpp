@@ -26,7 +26,12 @@ bool TNameText::Equal(std::string_view a, std::string_view b) noexcept
 int TNameText::Compare(std::string_view a, std::string_view b) noexcept
 {
     const std::size_t common = std::min(a.size(), b.size());
-    for (std::size_t i = 0; i < common; ++i) {
+    std::size_t i = 0;
+    // Names that are compared often begin alike, such as those of a vendor's classes.
+    while (i + sizeof(std::uint64_t) <= common && Load<std::uint64_t>(a, i) == Load<std::uint64_t>(b, i)) {
+        i += sizeof(std::uint64_t);
+    }
+    for (; i < common; ++i) {
         const int difference = static_cast<int>(static_cast<unsigned char>(ToLower(a[i]))) -
                                static_cast<int>(static_cast<unsigned char>(ToLower(b[i])));
         if (difference != 0) {

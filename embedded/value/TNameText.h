@@ -31,21 +31,16 @@ class CIMDELTA_EXPORT TNameText {
     /// Whether both are the same bytes.
     static bool HasSameSpelling(std::string_view a, std::string_view b) noexcept
     {
-        using TWord = std::uint64_t;
         if (a.size() != b.size()) {
             return false;
         }
-        if (a.size() < sizeof(TWord) || a.size() > 2 * sizeof(TWord)) {
-            return a.empty() || std::memcmp(a.data(), b.data(), a.size()) == 0;
+        if (a.size() >= sizeof(std::uint64_t) && a.size() <= 2 * sizeof(std::uint64_t)) {
+            return HasSameTwoWords<std::uint64_t>(a, b);
         }
-        // Most names take two words, which may overlap.
-        const auto load = [](std::string_view text, std::size_t position) {
-            TWord word;
-            std::memcpy(&word, text.data() + position, sizeof word);
-            return word;
-        };
-        const std::size_t second = a.size() - sizeof(TWord);
-        return ((load(a, 0) ^ load(b, 0)) | (load(a, second) ^ load(b, second))) == 0;
+        if (a.size() >= sizeof(std::uint32_t) && a.size() < sizeof(std::uint64_t)) {
+            return HasSameTwoWords<std::uint32_t>(a, b);
+        }
+        return a.empty() || std::memcmp(a.data(), b.data(), a.size()) == 0;
     }
     /// Negative, zero or positive, as the bytes of the lower-case forms compare.
     static int Compare(std::string_view a, std::string_view b) noexcept;
@@ -63,6 +58,23 @@ class CIMDELTA_EXPORT TNameText {
     struct THash {
         std::size_t operator()(std::string_view name) const noexcept { return Hash(name); }
     };
+
+  private:
+    template <class TWord>
+    static TWord Load(std::string_view text, std::size_t position) noexcept
+    {
+        TWord word;
+        std::memcpy(&word, text.data() + position, sizeof word);
+        return word;
+    }
+
+    /// Compares the first and the last word, which may overlap: all that a name of up to two words has.
+    template <class TWord>
+    static bool HasSameTwoWords(std::string_view a, std::string_view b) noexcept
+    {
+        const std::size_t last = a.size() - sizeof(TWord);
+        return ((Load<TWord>(a, 0) ^ Load<TWord>(b, 0)) | (Load<TWord>(a, last) ^ Load<TWord>(b, last))) == 0;
+    }
 };
 
 /// Keyed by name and ordered by it; `find` takes any text and makes no std::string.

@@ -43,6 +43,11 @@ TEST(NameTextTest, OrderIsThatOfTheLowerCaseBytes)
     EXPECT_LT(TNameText::Compare("Key", "Key2"), 0);
     EXPECT_GT(TNameText::Compare("\xC3\x84", "z"), 0);
     EXPECT_LT(TNameText::Compare("A_", "AB"), 0) << "an underscore stands before lower-case letters";
+    const std::string common(20, 'a');
+    EXPECT_LT(TNameText::Compare(common + "B", common + "c"), 0);
+    EXPECT_GT(TNameText::Compare(common + "c", common + "B"), 0);
+    EXPECT_LT(TNameText::Compare(common, common + "b"), 0);
+    EXPECT_EQ(0, TNameText::Compare(common + "bcdefghi", common + "BCDEFGHI"));
 }
 
 TEST(NameTextTest, MapsFindANameInAnySpelling)
