@@ -48,23 +48,11 @@ struct TSse2XmlSearch {
 
     static std::size_t CountLineEnds(const char* from, const char* to) noexcept
     {
-        const __m128i lineFeed = _mm_set1_epi8('\n');
-        const __m128i carriageReturn = _mm_set1_epi8('\r');
         std::size_t count = 0;
         while (static_cast<std::size_t>(to - from) >= kStep) {
-            // Each byte of the sum counts to 255 at most.
-            const std::size_t steps = std::min<std::size_t>(static_cast<std::size_t>(to - from) / kStep, 255);
-            __m128i sum = _mm_setzero_si128();
-            for (std::size_t step = 0; step < steps; ++step, from += kStep) {
-                const __m128i bytes = Load(from);
-                const __m128i isLast = _mm_cmpeq_epi8(bytes, lineFeed);
-                const __m128i isAlone =
-                    _mm_andnot_si128(_mm_cmpeq_epi8(Load(from + 1), lineFeed), _mm_cmpeq_epi8(bytes, carriageReturn));
-                sum = _mm_sub_epi8(sum, _mm_or_si128(isLast, isAlone));  // true is -1
-            }
-            sum = _mm_sad_epu8(sum, _mm_setzero_si128());
-            count += static_cast<std::size_t>(_mm_cvtsi128_si64(sum)) +
-                     static_cast<std::size_t>(_mm_cvtsi128_si64(_mm_unpackhi_epi64(sum, sum)));
+            const char* const end = from + std::min<std::size_t>(static_cast<std::size_t>(to - from) / kStep, kMostSteps) * kStep;
+            count += CountInSteps(from, end);
+            from = end;
         }
         return count + TPlainXmlSearch::CountLineEnds(from, to);
     }
@@ -72,8 +60,33 @@ struct TSse2XmlSearch {
   private:
     static constexpr std::size_t kStep = kReadsBeyond;
     static constexpr unsigned int kAll = 0xFFFF;
+    static constexpr std::size_t kMostSteps = 255;  // each byte of a sum counts so far
 
     static __m128i Load(const char* from) noexcept { return _mm_loadu_si128(reinterpret_cast<const __m128i*>(from)); }
+
+    /// Counts line feeds first; that is enough for a document without carriage returns.
+    static std::size_t CountInSteps(const char* from, const char* to) noexcept
+    {
+        const __m128i lineFeed = _mm_set1_epi8('\n');
+        const __m128i carriageReturn = _mm_set1_epi8('\r');
+        __m128i sum = _mm_setzero_si128();
+        __m128i returns = _mm_setzero_si128();
+        for (const char* at = from; at < to; at += kStep) {
+            const __m128i bytes = Load(at);
+            sum = _mm_sub_epi8(sum, _mm_cmpeq_epi8(bytes, lineFeed));  // true is -1
+            returns = _mm_or_si128(returns, _mm_cmpeq_epi8(bytes, carriageReturn));
+        }
+        if (_mm_movemask_epi8(returns) != 0) {
+            for (const char* at = from; at < to; at += kStep) {
+                const __m128i isReturn = _mm_cmpeq_epi8(Load(at), carriageReturn);
+                sum = _mm_sub_epi8(sum, _mm_andnot_si128(_mm_cmpeq_epi8(Load(at + 1), lineFeed), isReturn));
+            }
+        }
+        sum = _mm_sad_epu8(sum, _mm_setzero_si128());
+        return static_cast<std::size_t>(_mm_cvtsi128_si64(sum)) +
+               static_cast<std::size_t>(_mm_cvtsi128_si64(_mm_unpackhi_epi64(sum, sum)));
+    }
+
     static unsigned int CompareStep(const char* one, const char* other) noexcept
     {
         return static_cast<unsigned int>(_mm_movemask_epi8(_mm_cmpeq_epi8(Load(one), Load(other))));
