@@ -69,6 +69,9 @@ void TCimXmlReader::OnKnownStart(std::size_t number, const char* name, const cha
         fItem = &fProperty.GetItem();
         return fContext.Guard([&] { fProperty.BeginInInstance(number, known); });
     }
+    if (action == TTable::kBeginValue) {
+        return fContext.Guard([&] { BeginValue(); });
+    }
     fContext.Guard([&] { Begin(action, known); });
 }
 

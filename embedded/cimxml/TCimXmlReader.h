@@ -55,7 +55,9 @@ class TCimXmlReader : public IXmlSink {
     /// If only elements may stand here, the text must be white space.
     void CheckBlank() const
     {
-        if (!fText.empty() && !TTable::TakesText(GetState())) {
+        // Between two tags, there is mostly nothing or one line feed.
+        const bool isLineFeed = fText.size() == 1 && fText.front() == '\n';
+        if (!fText.empty() && !isLineFeed && !TTable::TakesText(GetState())) {
             RequireBlank();
         }
     }

@@ -40,6 +40,13 @@ constexpr std::string_view kBlanks = " \t\r\n";
 constexpr const char* kTypeNames[] = {"",       "boolean", "uint8",  "sint8",  "uint16", "sint16", "uint32",   "sint32",
                                       "uint64", "sint64",  "real32", "real64", "char16", "string", "datetime", "reference"};
 
+/// Mostly there is nothing to trim, which the first and the last character show.
+std::string_view TrimBlanks(std::string_view text)
+{
+    const bool isTrimmed = !text.empty() && text.front() > ' ' && text.back() > ' ';
+    return isTrimmed ? text : Trim(text, kBlanks);
+}
+
 /// Reads a number that must fill the whole text.
 template <class T>
 bool ReadAll(std::string_view digits, T& number, int base)
@@ -172,14 +179,14 @@ bool TValueText::Parse(TCIMValue::TCIMType type, std::string_view text, TCIMValu
     case TType::kChar16:
         return ParseChar16(text, result);
     case TType::kBoolean:
-        return ParseBoolean(Trim(text, kBlanks), result);
+        return ParseBoolean(TrimBlanks(text), result);
     case TType::kDateTime:
-        return ParseDateTime(Trim(text, kBlanks), result);
+        return ParseDateTime(TrimBlanks(text), result);
     case TType::kReal32:
     case TType::kReal64:
-        return ParseReal(type, Trim(text, kBlanks), result);
+        return ParseReal(type, TrimBlanks(text), result);
     default:
-        return TTypeKind::IsInteger(type) && ParseInteger(type, Trim(text, kBlanks), result);
+        return TTypeKind::IsInteger(type) && ParseInteger(type, TrimBlanks(text), result);
     }
 }
 
