@@ -32,7 +32,7 @@ bool TCimXmlInstanceBuilder::Begin(const char* className)
     }
     fLayout = layout;
     fInstance = layout->cls->AllocateInMemInstance();
-    fExpected = 0;
+    fExpected = layout->first;
     ++fNumber;
     return true;
 }
@@ -55,52 +55,21 @@ TCimXmlLayout* TCimXmlInstanceBuilder::FindLayout(const char* className)
     return fLayouts.emplace(className, std::make_unique<TCimXmlLayout>(cls)).first->second.get();
 }
 
-TCimXmlTarget TCimXmlInstanceBuilder::FindProperty(const char* name)
+TCimXmlTarget& TCimXmlInstanceBuilder::FindProperty(const char* name)
 {
-    const TInMemClass& cls = *fLayout->cls;
-    const std::vector<std::uint32_t>& order = cls.GetLayout().GetOrder();
-    std::uint32_t slot = TInMemLayout::kNoSlot;
-    if (fExpected < order.size() && cls.GetLayout().GetDecl(order[fExpected]).GetName() == name) {
-        slot = order[fExpected];
-    } else {
-        slot = cls.GetLayout().FindSlot(name);
+    TCimXmlTarget* target = fExpected;
+    if (target == nullptr || *target->name != name) {
+        const std::uint32_t slot = fLayout->cls->GetLayout().FindSlot(name);
+        if (slot == TInMemLayout::kNoSlot) {
+            fContext.Fail(EStatus::kNotFound, "found property " + Quote(name) + ", but class " + Quote(fLayout->cls->GetName()) +
+                                                  " declares no such property; add its declaration or correct the name");
+        }
+        target = &fLayout->targets[slot];
     }
-    if (slot == TInMemLayout::kNoSlot) {
-        fContext.Fail(EStatus::kNotFound, "found property " + Quote(name) + ", but class " + Quote(cls.GetName()) +
-                                              " declares no such property; add its declaration or correct the name");
-    }
-    if (!TakeSlot(slot)) {
+    if (!Take(*target)) {
         fContext.Fail(EStatus::kParseError, DescribeSecondProperty(name, "instance"));
     }
-    return MakeTarget(slot);
-}
-
-bool TCimXmlInstanceBuilder::TakeLikely(std::size_t tagNumber, TCimXmlTarget& target) noexcept
-{
-    const std::vector<std::uint32_t>& order = fLayout->cls->GetLayout().GetOrder();
-    if (fExpected >= order.size() || fLayout->tags[order[fExpected]].number != tagNumber) {
-        return false;
-    }
-    const std::uint32_t slot = order[fExpected];
-    target = MakeTarget(slot);
-    return TakeSlot(slot);
-}
-
-TCimXmlTarget TCimXmlInstanceBuilder::MakeTarget(std::uint32_t slot) const noexcept
-{
-    const TInMemPropertyDecl& decl = fLayout->cls->GetLayout().GetDecl(slot);
-    return {&decl.GetName(), slot, decl.GetType(), fLayout->embedded[slot], decl.IsStatic()};
-}
-
-/// Notes that the instance has the property; false if it has had it.
-bool TCimXmlInstanceBuilder::TakeSlot(std::uint32_t slot) noexcept
-{
-    if (fLayout->given[slot] == fNumber) {
-        return false;
-    }
-    fLayout->given[slot] = fNumber;
-    fExpected = fLayout->positions[slot] + 1;
-    return true;
+    return *target;
 }
 
 void TCimXmlInstanceBuilder::SetProperty(const TCimXmlTarget& target, TCIMValue&& value, bool isUnsettled)
@@ -172,7 +141,7 @@ void TCimXmlInstanceBuilder::Fill(const TCimXmlDraft& draft, const TReadObjects&
     for (std::size_t index = 0; index < object.GetProperties().size(); ++index) {
         const TCimXmlContext::TAt at(fContext, draft.propertyPlaces[index]);
         const TEmbeddedObject::TProperty& property = object.GetProperties()[index];
-        const TCimXmlTarget target = FindProperty(property.name.c_str());
+        const TCimXmlTarget& target = FindProperty(property.name.c_str());
         TCIMValue value = target.isEmbedded ? readObjects(property.value) : property.value;
         const bool isOpen = Localize(value);
         SetProperty(target, std::move(value), isOpen);
@@ -192,7 +161,7 @@ void TCimXmlInstanceBuilder::FillKeys(const TOwnKeys& keys)
 {
     for (const auto& [name, value] : keys) {
         const std::uint32_t slot = fLayout->cls->GetLayout().FindSlot(name);
-        if (slot == TInMemLayout::kNoSlot || fLayout->given[slot] == fNumber) {
+        if (slot == TInMemLayout::kNoSlot || fLayout->targets[slot].given == fNumber) {
             continue;
         }
         const TInMemPropertyDecl& decl = fLayout->cls->GetLayout().GetDecl(slot);
@@ -201,7 +170,7 @@ void TCimXmlInstanceBuilder::FillKeys(const TOwnKeys& keys)
         Localize(converted);  // the name was read before classes in front of it were declared
         const bool mayRefer =
             TValueAccess::GetForm(converted) == TValueAccess::kPath || TValueAccess::GetForm(converted) == TValueAccess::kObject;
-        SetProperty({&decl.GetName(), slot, decl.GetType(), false, decl.IsStatic()}, std::move(converted), mayRefer);
+        SetProperty(fLayout->targets[slot], std::move(converted), mayRefer);
         fContext.Tolerate("key from name", "an instance of class " + Quote(fLayout->cls->GetName()) + " leaves out its key " +
                                                Quote(name) + "; taken from the name in front of it");
     }

@@ -36,16 +36,24 @@ class TCimXmlInstanceBuilder {
     /// Starts an instance; false if its class is not known yet.
     bool Begin(const char* className);
     /// Errors: kNotFound (15) if the class has no such property, kParseError (9) if the instance has had it already.
-    TCimXmlTarget FindProperty(const char* name);
-    /// As FindProperty, for the property that is likely to come next. Returns false if the property did not note that tag last
-    /// time, or if the instance has the property already; `target` is then meaningless.
-    bool TakeLikely(std::size_t tagNumber, TCimXmlTarget& target) noexcept;
-    /// What is noted of the tag of a property, in instances of the same class.
-    TCimXmlLayout::TTag& GetTag(const TCimXmlTarget& target) noexcept { return fLayout->tags[target.slot]; }
+    TCimXmlTarget& FindProperty(const char* name);
+    /// As FindProperty, for the property that is likely to come next. Returns null if the property did not note that tag last
+    /// time, or if the instance has the property already.
+    TCimXmlTarget* TakeLikely(std::size_t tagNumber) noexcept
+    {
+        TCimXmlTarget* const target = fExpected;
+        return target != nullptr && target->tag.number == tagNumber && Take(*target) ? target : nullptr;
+    }
     /// `isUnsettled` says that references in the value may have to be written again (see TCimXmlPathReader::TakeMetUnsettled). A
     /// value of another type is converted. Errors: kTypeMismatch (13) if that would lose something; kParseError (9) if the property
     /// is static and another instance has given it another value.
     void SetProperty(const TCimXmlTarget& target, TCIMValue&& value, bool isUnsettled);
+    /// As SetProperty with a value that is not unsettled and not null. Returns false if there is more to do than to keep the value,
+    /// which is then as it was; otherwise it is null now.
+    bool FillProperty(const TCimXmlTarget& target, TCIMValue& value) noexcept
+    {
+        return target.isKeptAsIs && value.GetType() == target.type && fInstance->FillSlot(target.slot, value);
+    }
     /// Begins the instance and sets all its properties. Call it for a draft when the document has ended. Errors: kNotFound (15) if
     /// its class is not declared; those of FindProperty and SetProperty.
     void Fill(const TCimXmlDraft& draft, const TReadObjects& readObjects);
@@ -56,8 +64,16 @@ class TCimXmlInstanceBuilder {
     bool IsHeld() const noexcept { return fLayout->isHeld; }
 
   private:
-    bool TakeSlot(std::uint32_t slot) noexcept;
-    TCimXmlTarget MakeTarget(std::uint32_t slot) const noexcept;
+    /// Notes that the instance has the property; false if it has had it.
+    bool Take(TCimXmlTarget& target) noexcept
+    {
+        if (target.given == fNumber) {
+            return false;
+        }
+        target.given = fNumber;
+        fExpected = target.next;
+        return true;
+    }
     TCimXmlLayout* FindLayout(const char* className);
     void SetStatic(const TCimXmlTarget& target, const TCIMValue& value);
     TCIMValue Convert(const TCimXmlTarget& target, const TCIMValue& value);
@@ -74,7 +90,7 @@ class TCimXmlInstanceBuilder {
     boost::shared_ptr<TInMemInstance> fInstance;
     std::set<const TInMemPropertyDecl*> fGivenStatics;  // those that an instance has given a value, or NULL
     std::uint32_t fNumber = 0;                          // of the instance, from 1
-    std::size_t fExpected = 0;                          // the position of the property that is likely to come next
+    TCimXmlTarget* fExpected = nullptr;                 // the property that is likely to come next, or null
 };
 
 }  // namespace NORVZEL20

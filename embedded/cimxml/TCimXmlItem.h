@@ -13,8 +13,8 @@ class TCimXmlObjectReader;
 
 /// A property, a qualifier or a qualifier's declaration while its value is read. One item serves many elements in turn.
 ///
-/// Order of calls: Begin; for a simple value BeginValue and then SetText, SetReference or, for a null, nothing; for an array BeginArray, any number of
-/// AddText, AddReference and AddNull, EndArray; at last Take. Without a value, Take returns a typed null.
+/// Order of calls: Begin; for a simple value BeginValue and then SetText, SetReference or, for a null, nothing; for an array
+/// BeginArray, any number of AddText, AddReference and AddNull, EndArray; at last Take. Without a value, Take returns a typed null.
 /// Errors: fail through the context with the status that each operation names; the load then ends.
 class TCimXmlItem {
   public:
@@ -61,6 +61,8 @@ class TCimXmlItem {
     TType GetType() const noexcept { return fType; }
     EText GetText() const noexcept { return fText; }
     bool IsNull() const noexcept { return fValue.IsNull(); }
+    /// The value, which the caller may move away; null if there is none.
+    TCIMValue& GetValue() noexcept { return fValue; }
     /// The value, or a null of the item's type.
     TCIMValue Take();
 

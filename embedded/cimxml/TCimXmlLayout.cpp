@@ -5,15 +5,22 @@
 namespace NORVZEL20 {
 
 TCimXmlLayout::TCimXmlLayout(boost::shared_ptr<TInMemClass> ofClass)
-    : cls(std::move(ofClass)), positions(cls->GetLayout().GetSlotCount()), given(cls->GetLayout().GetSlotCount()),
-      tags(cls->GetLayout().GetSlotCount())
+    : cls(std::move(ofClass)), targets(cls->GetLayout().GetSlotCount())
 {
-    for (std::uint32_t slot = 0; slot < cls->GetLayout().GetSlotCount(); ++slot) {
-        embedded.push_back(cls->GetLayout().GetDecl(slot).HoldsObjects());
+    for (std::uint32_t slot = 0; slot < targets.size(); ++slot) {
+        const TInMemPropertyDecl& decl = cls->GetLayout().GetDecl(slot);
+        TCimXmlTarget& target = targets[slot];
+        target.name = &decl.GetName();
+        target.slot = slot;
+        target.type = decl.GetType();
+        target.isEmbedded = decl.HoldsObjects();
+        target.isStatic = decl.IsStatic();
+        target.isKeptAsIs = !decl.IsStatic() && !decl.IsBag();
     }
-    const std::vector<std::uint32_t>& order = cls->GetLayout().GetOrder();
-    for (std::uint32_t position = 0; position < order.size(); ++position) {
-        positions[order[position]] = position;
+    TCimXmlTarget** link = &first;
+    for (const std::uint32_t slot : cls->GetLayout().GetOrder()) {
+        *link = &targets[slot];
+        link = &targets[slot].next;
     }
 }
 

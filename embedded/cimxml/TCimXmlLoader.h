@@ -37,11 +37,11 @@ class CIMDELTA_INTERNAL_EXPORT TCimXmlLoader {
     void AddClass(TCimXmlDraft draft);
 
     /// Starts an instance. If it returns false, read the instance as a draft and call AddInstance; otherwise call FindProperty or
-    /// TakeLikely, and SetProperty, for each of its properties (see TCimXmlInstanceBuilder), then EndInstance.
+    /// TakeLikely, and SetProperty or FillProperty, for each of its properties (see TCimXmlInstanceBuilder), then EndInstance.
     bool BeginInstance(const char* className);
-    TCimXmlTarget FindProperty(const char* name) { return fBuilder.FindProperty(name); }
-    bool TakeLikely(std::size_t tagNumber, TCimXmlTarget& target) noexcept { return fBuilder.TakeLikely(tagNumber, target); }
-    TCimXmlLayout::TTag& GetTag(const TCimXmlTarget& target) noexcept { return fBuilder.GetTag(target); }
+    TCimXmlTarget& FindProperty(const char* name) { return fBuilder.FindProperty(name); }
+    TCimXmlTarget* TakeLikely(std::size_t tagNumber) noexcept { return fBuilder.TakeLikely(tagNumber); }
+    bool FillProperty(const TCimXmlTarget& target, TCIMValue& value) noexcept { return fBuilder.FillProperty(target, value); }
     void SetProperty(const TCimXmlTarget& target, TCIMValue&& value, bool isUnsettled)
     {
         fBuilder.SetProperty(target, std::move(value), isUnsettled);

@@ -32,27 +32,31 @@ void TCimXmlPropertyReader::BeginInDraft(const TCimXmlAttributes& attributes)
 
 void TCimXmlPropertyReader::BeginInInstance(const TCimXmlAttributes& attributes)
 {
-    fTarget = fLoader->FindProperty(attributes.Require("NAME"));
-    const TType type = ReadType(attributes, fTarget.type);
-    fItem.Begin(*fTarget.name, type, GetText(attributes, type, fTarget.isEmbedded));
+    fTarget = &fLoader->FindProperty(attributes.Require("NAME"));
+    const TType type = ReadType(attributes, fTarget->type);
+    fItem.Begin(*fTarget->name, type, GetText(attributes, type, fTarget->isEmbedded));
 }
 
 void TCimXmlPropertyReader::BeginInInstance(std::size_t number, const TCimXmlAttributes& attributes)
 {
-    if (fLoader->TakeLikely(number, fTarget)) {
-        const TCimXmlLayout::TTag& tag = fLoader->GetTag(fTarget);
-        fItem.Begin(*fTarget.name, tag.type, tag.text);
+    if (TCimXmlTarget* const target = fLoader->TakeLikely(number)) {
+        fTarget = target;
+        fItem.Begin(*target->name, target->tag.type, target->tag.text);
         return;
     }
     BeginInInstance(attributes);
-    fLoader->GetTag(fTarget) = {number, fItem.GetType(), fItem.GetText()};
+    fTarget->tag = {number, fItem.GetType(), fItem.GetText()};
 }
 
 /// A new instance has nulls already, apart from what it shares with others.
 void TCimXmlPropertyReader::EndInInstance()
 {
-    if (!fItem.IsNull() || fTarget.isStatic) {
-        fLoader->SetProperty(fTarget, fItem.Take(), fPaths.TakeMetUnsettled());
+    if (fItem.IsNull() && !fTarget->isStatic) {
+        return;
+    }
+    const bool isUnsettled = fPaths.TakeMetUnsettled();
+    if (isUnsettled || !fLoader->FillProperty(*fTarget, fItem.GetValue())) {
+        fLoader->SetProperty(*fTarget, fItem.Take(), isUnsettled);
     }
 }
 

@@ -48,7 +48,7 @@ class TCimXmlPropertyReader {
     TCimXmlPathReader& fPaths;
     TCimXmlDraftBuilder& fDraft;
     TCimXmlItem fItem;
-    TCimXmlTarget fTarget{nullptr, 0, TType::kNone, false, false};  // of the property of an instance
+    TCimXmlTarget* fTarget = nullptr;  // the property of an instance that was begun last
 };
 
 }  // namespace NORVZEL20

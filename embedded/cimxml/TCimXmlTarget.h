@@ -1,19 +1,33 @@
 #pragma once
 
+#include <cstddef>
 #include <cstdint>
+#include <limits>
 #include <string>
 
+#include "embedded/cimxml/TCimXmlItem.h"
 #include "host/TCIMValue.h"
 
 namespace NORVZEL20 {
 
-/// A property of the instance being filled. A plain value, valid while the class lives.
+/// A property of a class whose instances are filled. Valid as long as the TCimXmlLayout that it is part of.
 struct TCimXmlTarget {
-    const std::string* name;  ///< as declared
-    std::uint32_t slot;
-    TCIMValue::TCIMType type;
-    bool isEmbedded;  ///< whether text may be an embedded object, as the declaration says
-    bool isStatic;    ///< whether all instances share the value
+    /// What a start tag of the property means.
+    struct TTag {
+        std::size_t number = std::numeric_limits<std::size_t>::max();  ///< see IXmlSink::OnKnownStart; at first, that of no tag
+        TCIMValue::TCIMType type = TCIMValue::TCIMType::kNone;
+        TCimXmlItem::EText text = TCimXmlItem::kPlain;
+    };
+
+    const std::string* name = nullptr;  ///< as declared
+    std::uint32_t slot = 0;
+    TCIMValue::TCIMType type = TCIMValue::TCIMType::kNone;
+    bool isEmbedded = false;        ///< whether text may be an embedded object, as the declaration says
+    bool isStatic = false;          ///< whether all instances share the value
+    bool isKeptAsIs = false;        ///< whether an instance holds values of that type as they are: see TInMemInstance::FillSlot
+    std::uint32_t given = 0;        ///< the number of the last instance that had the property
+    TTag tag;                       ///< the last one of the property
+    TCimXmlTarget* next = nullptr;  ///< the property declared after it
 };
 
 }  // namespace NORVZEL20

@@ -22,6 +22,7 @@
 #include "embedded/store/TInMemNamespace.h"
 #include "embedded/store/TPlacedAllocator.h"
 #include "embedded/store/TStoreRefusal.h"
+#include "embedded/value/TValueAccess.h"
 
 namespace NORVZEL20 {
 
@@ -193,6 +194,15 @@ void TInMemInstance::SetSlot(std::uint32_t slot, TCIMValue value)
         return;
     }
     Change(slot, Fit(slot, std::move(value)));
+}
+
+bool TInMemInstance::FillSlot(std::uint32_t slot, TCIMValue& value) noexcept
+{
+    if (slot >= fSlots) {
+        return false;
+    }
+    TValueAccess::MoveToNull(GetOwnProperties()[slot].fValue, value);
+    return true;
 }
 
 const std::string* TInMemInstance::FindMissingKey() const

@@ -51,6 +51,10 @@ class CIMDELTA_EXPORT TInMemInstance final : public ICIMInstance, public boost::
     const TCIMValue& GetSlotValue(std::uint32_t slot) const;
     /// Sets the property in a slot as ICIMProperty::SetValue does, without looking up a name. Errors: kTypeMismatch (13).
     void SetSlot(std::uint32_t slot, TCIMValue value);
+    /// The same without checks, for an instance that is being made: not yet added, and still null in that slot. `value` must have
+    /// the type that the property declares, and the property must not be static or a bag. Moves it away and returns true. Returns
+    /// false and does nothing if the property does not stand behind the instance.
+    bool FillSlot(std::uint32_t slot, TCIMValue& value) noexcept;
 
     /// Whether it is part of the namespace.
     bool IsAdded() const noexcept { return fAdded != 0; }

@@ -42,6 +42,13 @@ class CIMDELTA_INTERNAL_EXPORT TValueAccess {
     // The forms of text follow each other.
     static bool IsText(const TCIMValue& value) noexcept { return value.fForm >= kShortText && value.fForm <= kRunText; }
 
+    /// Moves `from`, which is null then, to a value that is null.
+    static void MoveToNull(TCIMValue& to, TCIMValue& from) noexcept
+    {
+        std::memcpy(static_cast<void*>(&to), static_cast<const void*>(&from), sizeof to);
+        from.fForm = kNull;
+    }
+
     /// Whether type, form and contents have the same bytes. Equal values may have different ones.
     static bool HasSameBytes(const TCIMValue& a, const TCIMValue& b) noexcept
     {

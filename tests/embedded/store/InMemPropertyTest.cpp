@@ -82,6 +82,21 @@ TEST_F(InMemPropertyTest, PropertiesBeyondThoseBehindTheInstanceKnowTheirPlaces)
     }
 }
 
+TEST_F(InMemPropertyTest, AValueIsMovedIntoASlotBehindTheInstance)
+{
+    GrowTo(2);
+    const auto instance = fClass->AllocateInMemInstance();
+    TCIMValue value = Uint64(7);
+    EXPECT_TRUE(instance->FillSlot(1, value));
+    EXPECT_TRUE(value.IsNull());
+    EXPECT_EQ(Uint64(7), instance->GetSlotValue(1));
+    GrowTo(3);
+    value = Uint64(8);
+    EXPECT_FALSE(instance->FillSlot(2, value));
+    EXPECT_EQ(Uint64(8), value) << "a value that finds no place stays";
+    EXPECT_TRUE(instance->GetSlotValue(2).IsNull());
+}
+
 TEST_F(InMemPropertyTest, PropertiesThatComeLateKnowTheirPlaces)
 {
     GrowTo(3);
