@@ -23,12 +23,9 @@ TInMemLayout::TInMemLayout(const TInMemLayout* super) : fSuper(super)
     CatchUp();
 }
 
-std::uint32_t TInMemLayout::FindSlot(std::string_view name) const noexcept
+/// The slot of a name that no guess has found.
+std::uint32_t TInMemLayout::SearchSlot(std::string_view name) const noexcept
 {
-    const std::uint32_t likely = fLikelySlots.Guess(name);
-    if (likely != TLikelySlots::kNone && TNameText::HasSameSpelling(fSlots[likely]->GetName(), name)) {
-        return likely;
-    }
     const auto isNamed = [&](std::uint32_t slot) { return TNameText::Equal(fSlots[slot]->GetName(), name); };
     return fSlotIndex.Find(TNameText::Hash(name), isNamed);
 }

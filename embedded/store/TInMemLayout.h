@@ -8,6 +8,7 @@
 #include "embedded/store/THashIndex.h"
 #include "embedded/store/TInMemPropertyDecl.h"
 #include "embedded/store/TLikelySlots.h"
+#include "embedded/value/TNameText.h"
 #include "host/Export.h"
 
 namespace NORVZEL20 {
@@ -28,7 +29,12 @@ class CIMDELTA_EXPORT TInMemLayout {
     TInMemLayout& operator=(const TInMemLayout&) = delete;
 
     /// kNoSlot if there is no such property. Letter case does not count. Cost: constant on average.
-    std::uint32_t FindSlot(std::string_view name) const noexcept;
+    std::uint32_t FindSlot(std::string_view name) const noexcept
+    {
+        const std::uint32_t likely = fLikelySlots.Guess(name);
+        const bool isLikely = likely != TLikelySlots::kNone && TNameText::HasSameSpelling(fSlots[likely].get()->GetName(), name);
+        return isLikely ? likely : SearchSlot(name);
+    }
     /// All slots ever given, those of removed properties included.
     std::uint32_t GetSlotCount() const noexcept { return static_cast<std::uint32_t>(fSlots.size()); }
     const TInMemPropertyDecl& GetDecl(std::uint32_t slot) const noexcept { return *fSlots[slot]; }
@@ -60,6 +66,7 @@ class CIMDELTA_EXPORT TInMemLayout {
     void Update(std::string_view name);
 
   private:
+    std::uint32_t SearchSlot(std::string_view name) const noexcept;
     void Insert(const boost::shared_ptr<TInMemPropertyDecl>& decl, std::size_t position);
     void Resolve(std::string_view name);
     void Append(const boost::shared_ptr<TInMemPropertyDecl>& decl);

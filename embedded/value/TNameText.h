@@ -31,16 +31,23 @@ class CIMDELTA_EXPORT TNameText {
     /// Whether both are the same bytes.
     static bool HasSameSpelling(std::string_view a, std::string_view b) noexcept
     {
+        using TWord = std::uint64_t;
+        using THalf = std::uint32_t;
         if (a.size() != b.size()) {
             return false;
         }
-        if (a.size() >= sizeof(std::uint64_t) && a.size() <= 2 * sizeof(std::uint64_t)) {
-            return HasSameTwoWords<std::uint64_t>(a, b);
+        if (a.size() < sizeof(THalf)) {
+            return a == b;
         }
-        if (a.size() >= sizeof(std::uint32_t) && a.size() < sizeof(std::uint64_t)) {
-            return HasSameTwoWords<std::uint32_t>(a, b);
+        if (a.size() < sizeof(TWord)) {
+            return HasSameEnds<THalf>(a, b);
         }
-        return a.empty() || std::memcmp(a.data(), b.data(), a.size()) == 0;
+        for (std::size_t at = sizeof(TWord); at + sizeof(TWord) < a.size(); at += sizeof(TWord)) {
+            if (Load<TWord>(a, at) != Load<TWord>(b, at)) {
+                return false;
+            }
+        }
+        return HasSameEnds<TWord>(a, b);
     }
     /// Negative, zero or positive, as the bytes of the lower-case forms compare.
     static int Compare(std::string_view a, std::string_view b) noexcept;
@@ -68,9 +75,9 @@ class CIMDELTA_EXPORT TNameText {
         return word;
     }
 
-    /// Compares the first and the last word, which may overlap: all that a name of up to two words has.
+    /// Whether the first and the last word of two texts of one length are the same. In a text shorter than two words they overlap.
     template <class TWord>
-    static bool HasSameTwoWords(std::string_view a, std::string_view b) noexcept
+    static bool HasSameEnds(std::string_view a, std::string_view b) noexcept
     {
         const std::size_t last = a.size() - sizeof(TWord);
         return ((Load<TWord>(a, 0) ^ Load<TWord>(b, 0)) | (Load<TWord>(a, last) ^ Load<TWord>(b, last))) == 0;
