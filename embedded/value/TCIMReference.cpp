@@ -199,7 +199,7 @@ bool TCIMReference::MakePlainPath(std::string& path) const
         }
         length += binding.first.size() + text.size() + std::string_view(".=\"\"").size();
     }
-    path.resize(length);
+    path = std::string(length, '\0');  // cheaper than growing the empty text to that length
     char* to = Put(path.data(), className);
     char separator = '.';
     for (const TContents::TBinding& binding : fContents->bindings) {
