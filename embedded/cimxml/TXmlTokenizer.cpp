@@ -14,6 +14,7 @@
 // '<'.
 #include "embedded/cimxml/TXmlTokenizer.h"
 
+#include <cstring>
 #include <string_view>
 #include <utility>
 
