@@ -364,7 +364,7 @@ void TXmlTokenizer::BeginEvent()
 }
 
 /// Skips the blanks outside of the outermost element; something else than markup behind them is refused. A carriage return at the
-/// end is refused too: if a line feed follows in the next piece, Expat counts two lines.
+/// end is refused too: if a line feed follows in the next piece, Expat may count two lines.
 EXmlScan TXmlTokenizer::SkipBlanks() noexcept
 {
     const char* const begin = fAt;
