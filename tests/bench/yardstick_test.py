@@ -89,7 +89,8 @@ class DriverTest(unittest.TestCase):
         self.assertNotIn("last ", self.drive("--only", "load", "--record", "a move").stdout)
         second = self.drive("--only", "load")
         self.assertRegex(second.stdout, r"\(last recorded: [-0-9]+, a move\)")
-        self.assertRegex(second.stdout, r"now +[.0-9]+ +[.0-9]+  [.0-9]+ x flat +last +[.0-9]+ +[.0-9]+  [.0-9]+ x flat\n")
+        # A clock with coarse steps may say 0, and then there is no ratio.
+        self.assertRegex(second.stdout, r"now +[.0-9]+ +[.0-9]+(  [.0-9]+ x flat)? +last +[.0-9]+ +[.0-9]+(  [.0-9]+ x flat)?\n")
 
     def test_a_peer_with_another_answer_ends_the_run_without_a_number(self):
         ended = self.drive("--only", "report", "load", "--record", "a move", build=self.programs_with_a_liar())

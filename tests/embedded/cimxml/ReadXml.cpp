@@ -12,12 +12,14 @@ namespace NORVZEL20 {
 
 namespace {
 
-/// Whether pieces cut a CR LF behind the last end tag. Versions of Expat differ in whether they count one line there or two.
-bool HasCutLineEnd(std::string_view document, std::size_t piece)
+/// Whether a piece ends with a carriage return behind the last end tag. Versions of Expat differ in how many lines they count
+/// there.
+bool EndsLineBehindRoot(std::string_view document, std::size_t piece)
 {
     const std::size_t endTag = document.rfind("</");
-    for (std::size_t at = piece; piece != 0 && at < document.size(); at += piece) {
-        if ((endTag == std::string_view::npos || at > endTag) && document[at - 1] == '\r' && document[at] == '\n') {
+    for (std::size_t at = 0; piece != 0 && at < document.size();) {
+        at = std::min(at + piece, document.size());
+        if ((endTag == std::string_view::npos || at > endTag) && document[at - 1] == '\r') {
             return true;
         }
     }
@@ -61,7 +63,7 @@ class TEventLog : public IXmlSink {
                             : piece % 2 == 0 ? ReadPieces(document, piece)
                                              : ReadBuffers(document, piece);
         Add(isRead ? "read" : "not read: ", fReader.GetError());
-        if (!HasCutLineEnd(document, piece)) {
+        if (!EndsLineBehindRoot(document, piece)) {
             AddPlace();
         }
     }
