@@ -33,6 +33,7 @@ class TEventLog : public IXmlSink {
 
     void OnStart(const char* name, const char** attributes) override
     {
+        ++fDepth;
         Add("<", name);
         for (const char** next = attributes; *next != nullptr; next += 2) {
             Add(" ", next[0]);
@@ -44,6 +45,7 @@ class TEventLog : public IXmlSink {
     {
         Add("</", name);
         AddPlace();
+        --fDepth;
     }
     void OnText(const char* text, std::size_t length) override
     {
@@ -59,13 +61,12 @@ class TEventLog : public IXmlSink {
 
     void Read(std::string_view document, std::size_t piece)
     {
+        fHasLineEndBehindRoot = EndsLineBehindRoot(document, piece);
         const bool isRead = piece == 0       ? fReader.Parse(document.data(), document.size(), true)
                             : piece % 2 == 0 ? ReadPieces(document, piece)
                                              : ReadBuffers(document, piece);
         Add(isRead ? "read" : "not read: ", fReader.GetError());
-        if (!EndsLineBehindRoot(document, piece)) {
-            AddPlace();
-        }
+        AddPlace();
     }
 
     TXmlOutcome TakeOutcome() { return {std::move(fText), fReader.CountTokens(), fReader.HasLeftToExpat()}; }
@@ -74,6 +75,9 @@ class TEventLog : public IXmlSink {
     void Add(std::string_view mark, std::string_view text) { fText.append(mark).append(text); }
     void AddPlace()
     {
+        if (fHasLineEndBehindRoot && fDepth == 0) {
+            return;
+        }
         const TXmlPlace place = fReader.GetPlace();
         fText += " @" + std::to_string(place.line) + ":" + std::to_string(place.column) + "\n";
     }
@@ -104,6 +108,8 @@ class TEventLog : public IXmlSink {
 
     TXmlReader fReader;
     std::string fText;
+    int fDepth = 0;  // of open elements
+    bool fHasLineEndBehindRoot = false;
 };
 
 }  // namespace
