@@ -2,9 +2,9 @@
 
 #include <string>
 
-#include "embedded/cimxml/TCimXmlContext.h"
 #include "embedded/cimxml/TCimXmlObjectReader.h"
 #include "embedded/cimxml/TCimXmlPathReader.h"
+#include "embedded/load/TLoadContext.h"
 #include "embedded/value/TValueAccess.h"
 #include "host/TZELException.h"
 
@@ -13,8 +13,8 @@ namespace NORVZEL20 {
 TCIMValue ReadObjectKey(const TCIMValue& text, const boost::shared_ptr<const TInMemNamespace>& ns, std::size_t depth)
 {
     // The load's own context must not see notes and errors of a text that may be none.
-    TCimXmlContext context{std::string(), depth};
-    const TCimXmlContext::TAt somewhere(context, {1, 1});
+    TLoadContext context{depth};
+    const TLoadContext::TAt somewhere(context, {});
     TCimXmlPathReader paths(context, ns);
     try {
         return TCimXmlObjectReader(context, ns, paths).Read(TValueAccess::GetText(text));

@@ -2,7 +2,7 @@
 
 #include <string>
 
-#include "embedded/cimxml/MessageText.h"
+#include "embedded/load/MessageText.h"
 #include "embedded/value/TValueText.h"
 
 namespace NORVZEL20 {

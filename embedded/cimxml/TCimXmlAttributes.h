@@ -2,8 +2,8 @@
 
 #include <cstring>
 
-#include "embedded/cimxml/TCimXmlContext.h"
 #include "embedded/cimxml/TCimXmlElement.h"
+#include "embedded/load/TLoadContext.h"
 #include "embedded/value/TNameText.h"
 #include "host/TCIMValue.h"
 
@@ -13,7 +13,7 @@ namespace NORVZEL20 {
 class TCimXmlAttributes {
   public:
     /// `attributes` alternates names and values and ends with null.
-    TCimXmlAttributes(const TCimXmlContext& context, TCimXmlElement::EElement element, const char** attributes) noexcept
+    TCimXmlAttributes(const TLoadContext& context, TCimXmlElement::EElement element, const char** attributes) noexcept
         : fContext(context), fElement(element), fAttributes(attributes)
     {}
 
@@ -62,7 +62,7 @@ class TCimXmlAttributes {
   private:
     [[noreturn]] void FailMissing(const char* name) const;
 
-    const TCimXmlContext& fContext;
+    const TLoadContext& fContext;
     TCimXmlElement::EElement fElement;
     const char** fAttributes;
 };

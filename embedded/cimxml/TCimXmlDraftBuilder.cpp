@@ -10,7 +10,7 @@
 
 #include <utility>
 
-#include "embedded/cimxml/MessageText.h"
+#include "embedded/load/MessageText.h"
 #include "embedded/store/TSchemaLimits.h"
 #include "embedded/value/TValueText.h"
 
@@ -21,18 +21,18 @@ using TType = TCIMValue::TCIMType;
 
 void TCimXmlDraftBuilder::BeginClass(const TCimXmlAttributes& attributes)
 {
-    fDraft.emplace(TCimXmlDraft{TEmbeddedObject(attributes.Require("NAME"), true), fContext.GetPlace(), {}, {}});
+    fDraft.emplace(TDraft{TEmbeddedObject(attributes.Require("NAME"), true), fContext.GetPlace(), {}, {}});
     fDraft->object.SetSuperClassName(attributes.Get("SUPERCLASS"));
 }
 
 void TCimXmlDraftBuilder::BeginInstance(const char* className)
 {
-    fDraft.emplace(TCimXmlDraft{TEmbeddedObject(className, false), fContext.GetPlace(), {}, {}});
+    fDraft.emplace(TDraft{TEmbeddedObject(className, false), fContext.GetPlace(), {}, {}});
 }
 
-TCimXmlDraft TCimXmlDraftBuilder::Take()
+TDraft TCimXmlDraftBuilder::Take()
 {
-    TCimXmlDraft draft = std::move(*fDraft);
+    TDraft draft = std::move(*fDraft);
     fDraft.reset();
     return draft;
 }

@@ -4,9 +4,9 @@
 #include <string>
 
 #include "embedded/cimxml/TCimXmlAttributes.h"
-#include "embedded/cimxml/TCimXmlContext.h"
-#include "embedded/cimxml/TCimXmlDraft.h"
-#include "embedded/cimxml/TXmlPlace.h"
+#include "embedded/load/TDraft.h"
+#include "embedded/load/TLoadContext.h"
+#include "embedded/load/TLoadPlace.h"
 
 namespace NORVZEL20 {
 
@@ -17,12 +17,12 @@ namespace NORVZEL20 {
 /// twice, or there are more parts than TSchemaLimits allows.
 class TCimXmlDraftBuilder {
   public:
-    explicit TCimXmlDraftBuilder(TCimXmlContext& context) : fContext(context) {}
+    explicit TCimXmlDraftBuilder(TLoadContext& context) : fContext(context) {}
 
     void BeginClass(const TCimXmlAttributes& attributes);
     void BeginInstance(const char* className);
     /// Ends the class or instance.
-    TCimXmlDraft Take();
+    TDraft Take();
 
     /// The value, and with it the type, comes at the end.
     void BeginProperty(const char* name, const TCimXmlAttributes& attributes);
@@ -40,10 +40,10 @@ class TCimXmlDraftBuilder {
     void CheckRoom(std::size_t count, std::size_t most, const char* what) const;
     unsigned int ReadArraySize(const TCimXmlAttributes& attributes) const;
 
-    TCimXmlContext& fContext;
-    std::optional<TCimXmlDraft> fDraft;
+    TLoadContext& fContext;
+    std::optional<TDraft> fDraft;
     std::optional<TEmbeddedObject::TProperty> fProperty;
-    TXmlPlace fPropertyPlace;
+    TLoadPlace fPropertyPlace;
     std::optional<TEmbeddedObject::TMethod> fMethod;
     std::optional<TEmbeddedObject::TParameter> fParameter;
 };

@@ -1,7 +1,7 @@
 #include "embedded/cimxml/TCimXmlItem.h"
 
-#include "embedded/cimxml/MessageText.h"
 #include "embedded/cimxml/TCimXmlObjectReader.h"
+#include "embedded/load/MessageText.h"
 #include "embedded/value/TEmbeddedObject.h"
 #include "embedded/value/TValueText.h"
 
@@ -48,10 +48,10 @@ void TCimXmlItem::Parse(std::string_view text, TCIMValue& value)
 /// Without a mark in the document, the declaration allows plain text too, so the text itself has to decide.
 bool TCimXmlItem::IsObject(std::string_view text) const
 {
-    if (fText == kPerhapsObject) {
+    if (fText == EValueText::kPerhapsObject) {
         return TEmbeddedObject::IsPerhapsText(text);
     }
-    return fText == kObject && !text.empty();
+    return fText == EValueText::kObject && !text.empty();
 }
 
 void TCimXmlItem::FailSecond() const

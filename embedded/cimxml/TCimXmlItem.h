@@ -4,7 +4,8 @@
 #include <utility>
 #include <vector>
 
-#include "embedded/cimxml/TCimXmlContext.h"
+#include "embedded/load/EValueText.h"
+#include "embedded/load/TLoadContext.h"
 #include "host/TCIMValue.h"
 
 namespace NORVZEL20 {
@@ -20,18 +21,11 @@ class TCimXmlItem {
   public:
     using TType = TCIMValue::TCIMType;
 
-    /// What the text of a string value may be.
-    enum EText : unsigned char {
-        kPlain,         ///< text alone
-        kObject,        ///< an embedded object, because the document marks the element so; empty text stays text
-        kPerhapsObject  ///< an embedded object if it looks like one: the class declares so, but the document does not mark it
-    };
-
     /// Both arguments must outlive the item.
-    TCimXmlItem(TCimXmlContext& context, TCimXmlObjectReader& objects) noexcept : fContext(context), fObjects(objects) {}
+    TCimXmlItem(TLoadContext& context, TCimXmlObjectReader& objects) noexcept : fContext(context), fObjects(objects) {}
 
     /// Starts the item. `name` is for messages and must stay valid until Take. `type` is an array type if the element says so.
-    void Begin(std::string_view name, TType type, EText text) noexcept
+    void Begin(std::string_view name, TType type, EValueText text) noexcept
     {
         fName = name;
         fType = type;
@@ -59,7 +53,7 @@ class TCimXmlItem {
     void EndArray();
 
     TType GetType() const noexcept { return fType; }
-    EText GetText() const noexcept { return fText; }
+    EValueText GetText() const noexcept { return fText; }
     bool IsNull() const noexcept { return fValue.IsNull(); }
     /// The value, which the caller may move away; null if there is none.
     TCIMValue& GetValue() noexcept { return fValue; }
@@ -71,11 +65,11 @@ class TCimXmlItem {
     bool IsObject(std::string_view text) const;
     [[noreturn]] void FailSecond() const;
 
-    TCimXmlContext& fContext;
+    TLoadContext& fContext;
     TCimXmlObjectReader& fObjects;
     std::string_view fName;
     TType fType = TType::kNone;
-    EText fText = kPlain;
+    EValueText fText = EValueText::kPlain;
     bool fIsGiven = false;
     TCIMValue fValue;
     std::vector<TCIMValue> fElements;  // of the array that is open; kept for its memory

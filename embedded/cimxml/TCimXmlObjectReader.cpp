@@ -12,9 +12,9 @@
 #include <utility>
 #include <vector>
 
-#include "embedded/cimxml/MessageText.h"
 #include "embedded/cimxml/TCimXmlReader.h"
 #include "embedded/cimxml/TXmlReader.h"
+#include "embedded/load/MessageText.h"
 #include "embedded/value/TEmbeddedObject.h"
 #include "embedded/value/TValueAccess.h"
 
@@ -23,8 +23,8 @@ namespace NORVZEL20 {
 /// The readers for one level of nesting.
 class TCimXmlObjectReader::TNested {
   public:
-    TNested(TCimXmlContext& context, const boost::shared_ptr<const TInMemNamespace>& ns)
-        : fContext(context), fReader(context, ns, nullptr), fXml(fReader, context.GetParser())
+    TNested(TLoadContext& context, const boost::shared_ptr<const TInMemNamespace>& ns, TXmlReader::EParser parser)
+        : fContext(context), fReader(context, ns, nullptr, parser), fXml(fReader, parser)
     {
         fXml.RefuseDocumentTypes();
     }
@@ -43,14 +43,14 @@ class TCimXmlObjectReader::TNested {
     bool TakeMetUnsettled() noexcept { return fReader.TakeMetUnsettled(); }
 
   private:
-    TCimXmlContext& fContext;
+    TLoadContext& fContext;
     TCimXmlReader fReader;
     TXmlReader fXml;
 };
 
-TCimXmlObjectReader::TCimXmlObjectReader(TCimXmlContext& context, boost::shared_ptr<const TInMemNamespace> ns,
-                                         TCimXmlPathReader& paths)
-    : fContext(context), fNamespace(std::move(ns)), fPaths(paths)
+TCimXmlObjectReader::TCimXmlObjectReader(TLoadContext& context, boost::shared_ptr<const TInMemNamespace> ns,
+                                         TCimXmlPathReader& paths, TXmlReader::EParser parser)
+    : fContext(context), fNamespace(std::move(ns)), fPaths(paths), fParser(parser)
 {}
 
 TCimXmlObjectReader::~TCimXmlObjectReader() = default;
@@ -59,7 +59,7 @@ TCIMValue TCimXmlObjectReader::Read(std::string_view text)
 {
     fContext.EnterEmbeddedObject();
     if (!fNested) {
-        fNested = std::make_unique<TNested>(fContext, fNamespace);
+        fNested = std::make_unique<TNested>(fContext, fNamespace, fParser);
     }
     TCIMValue value(fNested->Read(text));
     fContext.LeaveEmbeddedObject();

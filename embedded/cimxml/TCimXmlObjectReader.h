@@ -4,8 +4,9 @@
 #include <memory>
 #include <string_view>
 
-#include "embedded/cimxml/TCimXmlContext.h"
 #include "embedded/cimxml/TCimXmlPathReader.h"
+#include "embedded/cimxml/TXmlReader.h"
+#include "embedded/load/TLoadContext.h"
 #include "embedded/store/TInMemNamespace.h"
 #include "host/TCIMValue.h"
 
@@ -18,8 +19,9 @@ namespace NORVZEL20 {
 class TCimXmlObjectReader {
   public:
     /// The classes of references are looked up in `ns` (may be null). `paths` is notified of references to classes that are
-    /// not declared yet. `context` and `paths` must outlive the reader.
-    TCimXmlObjectReader(TCimXmlContext& context, boost::shared_ptr<const TInMemNamespace> ns, TCimXmlPathReader& paths);
+    /// not declared yet. `parser` reads the texts. `context` and `paths` must outlive the reader.
+    TCimXmlObjectReader(TLoadContext& context, boost::shared_ptr<const TInMemNamespace> ns, TCimXmlPathReader& paths,
+                        TXmlReader::EParser parser = TXmlReader::EParser::kTokenizer);
     TCimXmlObjectReader(const TCimXmlObjectReader&) = delete;
     TCimXmlObjectReader& operator=(const TCimXmlObjectReader&) = delete;
     ~TCimXmlObjectReader();
@@ -32,9 +34,10 @@ class TCimXmlObjectReader {
   private:
     class TNested;
 
-    TCimXmlContext& fContext;
+    TLoadContext& fContext;
     boost::shared_ptr<const TInMemNamespace> fNamespace;
     TCimXmlPathReader& fPaths;
+    const TXmlReader::EParser fParser;
     std::unique_ptr<TNested> fNested;  // made for the first object and kept, because an XML parser is expensive to make
 };
 

@@ -17,7 +17,7 @@
 
 #include <cstring>
 
-#include "embedded/cimxml/MessageText.h"
+#include "embedded/load/MessageText.h"
 #include "embedded/store/TReferenceAdapter.h"
 #include "embedded/store/TSchemaLimits.h"
 #include "embedded/value/TNameText.h"
@@ -51,7 +51,7 @@ bool ReadNumber(std::string_view text, TCIMValue& value)
 
 }  // namespace
 
-TCimXmlPathReader::TCimXmlPathReader(TCimXmlContext& context, boost::shared_ptr<const TInMemNamespace> ns)
+TCimXmlPathReader::TCimXmlPathReader(TLoadContext& context, boost::shared_ptr<const TInMemNamespace> ns)
     : fContext(context), fNamespace(std::move(ns)), fFrames(1)
 {}
 
@@ -110,12 +110,12 @@ TCIMReference TCimXmlPathReader::End()
 /// Gives the path the namespace and host that it is written with, unless they are the document's own.
 void TCimXmlPathReader::SetPlace(TCIMReference& path, const TFrame& frame)
 {
-    const TCimXmlOwnPlace::EAnswer answer = fContext.GetOwnPlace().Classify(frame.namespaceName, frame.host);
-    if (answer != TCimXmlOwnPlace::kOwn && !frame.namespaceName.empty()) {
+    const TOwnPlaceSearch::EAnswer answer = fContext.GetOwnPlace().Classify(frame.namespaceName, frame.host);
+    if (answer != TOwnPlaceSearch::kOwn && !frame.namespaceName.empty()) {
         path.SetNamespaceName(frame.namespaceName);
         path.SetHost(frame.host);
     }
-    fMetUnsettled = fMetUnsettled || answer == TCimXmlOwnPlace::kOpen;
+    fMetUnsettled = fMetUnsettled || answer == TOwnPlaceSearch::kOpen;
 }
 
 /// The key that a value without a name belongs to: the class must have exactly one.

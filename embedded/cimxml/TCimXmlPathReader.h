@@ -8,7 +8,7 @@
 #include <vector>
 
 #include "embedded/cimxml/TCimXmlAttributes.h"
-#include "embedded/cimxml/TCimXmlContext.h"
+#include "embedded/load/TLoadContext.h"
 #include "embedded/store/TInMemNamespace.h"
 #include "host/TCIMReference.h"
 
@@ -22,7 +22,7 @@ namespace NORVZEL20 {
 class TCimXmlPathReader {
   public:
     /// Classes are looked up in `ns` (may be null). `context` must outlive the reader.
-    TCimXmlPathReader(TCimXmlContext& context, boost::shared_ptr<const TInMemNamespace> ns);
+    TCimXmlPathReader(TLoadContext& context, boost::shared_ptr<const TInMemNamespace> ns);
 
     /// Begins a path inside of the innermost one. Errors: kParseError (9) if paths are nested too deeply.
     void Begin();
@@ -52,7 +52,7 @@ class TCimXmlPathReader {
     void NoteOwnNamespace();
 
     /// Whether a path that has ended since the last call may have to be written again at the end of the document: its class is not
-    /// declared, or it is open (see TCimXmlOwnPlace).
+    /// declared, or it is open (see TOwnPlaceSearch).
     bool TakeMetUnsettled() noexcept { return std::exchange(fMetUnsettled, false); }
     /// Reports such a path that another reader has read.
     void NoteUnsettled() noexcept { fMetUnsettled = true; }
@@ -72,7 +72,7 @@ class TCimXmlPathReader {
     void SetPlace(TCIMReference& path, const TFrame& frame);
     const std::string& FindOnlyKey(const TInMemClass* cls) const;
 
-    TCimXmlContext& fContext;
+    TLoadContext& fContext;
     boost::shared_ptr<const TInMemNamespace> fNamespace;
     boost::shared_ptr<TInMemClass> fLastClass;
     std::vector<TFrame> fFrames;  // kept for their memory; fDepth of them are open

@@ -1,20 +1,21 @@
 #pragma once
 
-#include <boost/function.hpp>
 #include <boost/smart_ptr/shared_ptr.hpp>
 #include <cstddef>
 #include <string>
 #include <vector>
 
-#include "embedded/cimxml/TLoadReport.h"
-#include "embedded/cimxml/TPopulateError.h"
+#include "embedded/cimxml/TCimXmlDocuments.h"
+#include "embedded/load/TLoadReport.h"
+#include "embedded/load/TPopulateError.h"
 #include "host/Export.h"
 #include "host/ICIMElement.h"
 #include "host/ICIMNamespace.h"
 
 namespace NORVZEL20 {
 
-/// Loads CIM-XML documents (DSP0201) into a namespace: declarations in any kind of group, and recorded requests and responses.
+/// Loads CIM-XML documents (DSP0201) into a namespace, each on its own; TLoadSession loads several as one. Accepts declarations in
+/// any kind of group, and recorded requests and responses.
 ///
 /// Order: classes may come in any order, and instances before their class. References are stored as their classes are declared,
 /// even if the declaration comes later. There is one exception: a key value without a name needs its class in front of it.
@@ -37,10 +38,7 @@ namespace NORVZEL20 {
 /// document type declaration is refused with kTypeMismatch (13).
 class CIMDELTA_EXPORT TCimXmlPopulator {
   public:
-    /// Fills the buffer with at most that many bytes and returns how many. It may return as few as it likes: small pieces are
-    /// gathered before they are parsed. 0 ends the document; the source is not called again after that. If it throws, the load
-    /// fails with that exception.
-    using TPullSource = boost::function<std::size_t(char*, std::size_t)>;
+    using TPullSource = TCimXmlDocuments::TPullSource;
 
     /// The populator loads into `ns` and keeps it alive.
     explicit TCimXmlPopulator(boost::shared_ptr<ICIMNamespace> ns);

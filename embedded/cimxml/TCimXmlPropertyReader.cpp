@@ -22,7 +22,7 @@ bool IsMarkedEmbedded(const TCimXmlAttributes& attributes)
 
 }  // namespace
 
-/// In a draft, unmarked text stays text: its class is not known yet (see TCimXmlInstanceBuilder::Fill).
+/// In a draft, unmarked text stays text: its class is not known yet (see TInstanceBuilder::Fill).
 void TCimXmlPropertyReader::BeginInDraft(const TCimXmlAttributes& attributes)
 {
     fDraft.BeginProperty(attributes.Require("NAME"), attributes);
@@ -37,9 +37,9 @@ void TCimXmlPropertyReader::BeginInInstance(const TCimXmlAttributes& attributes)
     fItem.Begin(*fTarget->name, type, GetText(attributes, type, fTarget->isEmbedded));
 }
 
-void TCimXmlPropertyReader::BeginInInstance(std::size_t number, const TCimXmlAttributes& attributes)
+void TCimXmlPropertyReader::BeginInInstance(std::uint64_t number, const TCimXmlAttributes& attributes)
 {
-    if (TCimXmlTarget* const target = fLoader->TakeLikely(number)) {
+    if (TLoadTarget* const target = fLoader->TakeLikely(number)) {
         fTarget = target;
         fItem.Begin(*target->name, target->tag.type, target->tag.text);
         return;
@@ -60,15 +60,15 @@ void TCimXmlPropertyReader::EndInInstance()
     }
 }
 
-TCimXmlItem::EText TCimXmlPropertyReader::GetText(const TCimXmlAttributes& attributes, TType type, bool isDeclaredEmbedded)
+EValueText TCimXmlPropertyReader::GetText(const TCimXmlAttributes& attributes, TType type, bool isDeclaredEmbedded)
 {
     if (type.GetElementType() != TType::kString) {
-        return TCimXmlItem::kPlain;
+        return EValueText::kPlain;
     }
     if (IsMarkedEmbedded(attributes)) {
-        return TCimXmlItem::kObject;
+        return EValueText::kObject;
     }
-    return isDeclaredEmbedded ? TCimXmlItem::kPerhapsObject : TCimXmlItem::kPlain;
+    return isDeclaredEmbedded ? EValueText::kPerhapsObject : EValueText::kPlain;
 }
 
 /// The type that the element gives. If that is the declared one, as it mostly is, its name need not be looked up.

@@ -3,12 +3,12 @@
 #include <cstddef>
 
 #include "embedded/cimxml/TCimXmlAttributes.h"
-#include "embedded/cimxml/TCimXmlContext.h"
 #include "embedded/cimxml/TCimXmlDraftBuilder.h"
 #include "embedded/cimxml/TCimXmlItem.h"
-#include "embedded/cimxml/TCimXmlLoader.h"
 #include "embedded/cimxml/TCimXmlPathReader.h"
-#include "embedded/cimxml/TCimXmlTarget.h"
+#include "embedded/load/TLoadContext.h"
+#include "embedded/load/TLoadTarget.h"
+#include "embedded/load/TLoader.h"
 
 namespace NORVZEL20 {
 
@@ -19,7 +19,7 @@ namespace NORVZEL20 {
 class TCimXmlPropertyReader {
   public:
     /// All arguments must outlive the reader. `loader` may be null if no instance is filled directly.
-    TCimXmlPropertyReader(TCimXmlContext& context, TCimXmlObjectReader& objects, TCimXmlLoader* loader, TCimXmlPathReader& paths,
+    TCimXmlPropertyReader(TLoadContext& context, TCimXmlObjectReader& objects, TLoader* loader, TCimXmlPathReader& paths,
                           TCimXmlDraftBuilder& draft) noexcept
         : fContext(context), fLoader(loader), fPaths(paths), fDraft(draft), fItem(context, objects)
     {}
@@ -31,24 +31,24 @@ class TCimXmlPropertyReader {
     void BeginInDraft(const TCimXmlAttributes& attributes);
     void EndInDraft() { fDraft.EndProperty(fItem.Take()); }
 
-    /// Begins a property of the instance that the loader is filling. Errors: see TCimXmlInstanceBuilder::FindProperty.
+    /// Begins a property of the instance that the loader is filling. Errors: see TInstanceBuilder::FindProperty.
     void BeginInInstance(const TCimXmlAttributes& attributes);
     /// The same for a tag with a number (see IXmlSink::OnKnownStart): what was found out for it before is not looked up again.
-    void BeginInInstance(std::size_t number, const TCimXmlAttributes& attributes);
+    void BeginInInstance(std::uint64_t number, const TCimXmlAttributes& attributes);
     void EndInInstance();
 
   private:
     using TType = TCIMValue::TCIMType;
 
-    static TCimXmlItem::EText GetText(const TCimXmlAttributes& attributes, TType type, bool isDeclaredEmbedded);
+    static EValueText GetText(const TCimXmlAttributes& attributes, TType type, bool isDeclaredEmbedded);
     static TType ReadType(const TCimXmlAttributes& attributes, TType declared);
 
-    TCimXmlContext& fContext;
-    TCimXmlLoader* fLoader;
+    TLoadContext& fContext;
+    TLoader* fLoader;
     TCimXmlPathReader& fPaths;
     TCimXmlDraftBuilder& fDraft;
     TCimXmlItem fItem;
-    TCimXmlTarget* fTarget = nullptr;  // the property of an instance that was begun last
+    TLoadTarget* fTarget = nullptr;  // the property of an instance that was begun last
 };
 
 }  // namespace NORVZEL20

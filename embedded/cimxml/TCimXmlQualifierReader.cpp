@@ -24,7 +24,7 @@ TDecl::EFlavor ReadFlavor(const TCimXmlAttributes& attributes)
 void TCimXmlQualifierReader::Begin(const TCimXmlAttributes& attributes)
 {
     fName = attributes.Require("NAME");
-    fItem.Begin(fName, attributes.RequireType(), TCimXmlItem::kPlain);
+    fItem.Begin(fName, attributes.RequireType(), EValueText::kPlain);
     fFlavor = ReadFlavor(attributes);
     fIsPropagated = attributes.IsTrue("PROPAGATED", false);
 }
@@ -38,7 +38,7 @@ void TCimXmlQualifierReader::BeginDecl(const TCimXmlAttributes& attributes)
 {
     const TCIMValue::TCIMType type = attributes.RequireType();
     fName = attributes.Require("NAME");
-    fItem.Begin(fName, attributes.IsTrue("ISARRAY", false) ? type.GetArrayType() : type, TCimXmlItem::kPlain);
+    fItem.Begin(fName, attributes.IsTrue("ISARRAY", false) ? type.GetArrayType() : type, EValueText::kPlain);
     fFlavor = ReadFlavor(attributes);
     fScope = 0;
 }
@@ -56,7 +56,7 @@ void TCimXmlQualifierReader::ReadScope(const TCimXmlAttributes& attributes)
     }
 }
 
-TCimXmlQualifierDraft TCimXmlQualifierReader::TakeDecl()
+TQualifierDraft TCimXmlQualifierReader::TakeDecl()
 {
     return {fName, fItem.Take(), static_cast<TDecl::EScope>(fScope), fFlavor};
 }

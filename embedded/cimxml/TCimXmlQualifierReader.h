@@ -3,8 +3,9 @@
 #include <string>
 
 #include "embedded/cimxml/TCimXmlAttributes.h"
-#include "embedded/cimxml/TCimXmlDraft.h"
 #include "embedded/cimxml/TCimXmlItem.h"
+#include "embedded/load/TQualifierDraft.h"
+#include "embedded/value/TEmbeddedObject.h"
 
 namespace NORVZEL20 {
 
@@ -14,7 +15,7 @@ namespace NORVZEL20 {
 class TCimXmlQualifierReader {
   public:
     /// Both arguments must outlive the reader.
-    TCimXmlQualifierReader(TCimXmlContext& context, TCimXmlObjectReader& objects) noexcept : fItem(context, objects) {}
+    TCimXmlQualifierReader(TLoadContext& context, TCimXmlObjectReader& objects) noexcept : fItem(context, objects) {}
 
     void Begin(const TCimXmlAttributes& attributes);
     /// The qualifier that has ended.
@@ -24,7 +25,7 @@ class TCimXmlQualifierReader {
     /// Reads SCOPE; a second one adds to the first.
     void ReadScope(const TCimXmlAttributes& attributes);
     /// The declaration that has ended.
-    TCimXmlQualifierDraft TakeDecl();
+    TQualifierDraft TakeDecl();
 
     TCimXmlItem& GetItem() noexcept { return fItem; }
 

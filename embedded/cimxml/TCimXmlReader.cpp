@@ -19,8 +19,8 @@
 #include <boost/smart_ptr/make_shared.hpp>
 #include <utility>
 
-#include "embedded/cimxml/MessageText.h"
 #include "embedded/cimxml/TXmlCharacter.h"
+#include "embedded/load/MessageText.h"
 
 namespace NORVZEL20 {
 
@@ -30,9 +30,11 @@ using EStatus = TZELStatusCode::EStatusCode;
 
 }  // namespace
 
-TCimXmlReader::TCimXmlReader(TCimXmlContext& context, const boost::shared_ptr<const TInMemNamespace>& ns, TCimXmlLoader* loader)
-    : fContext(context), fLoader(loader), fPaths(context, ns), fObjects(context, ns, fPaths), fDraft(context),
-      fProperty(context, fObjects, loader, fPaths, fDraft), fQualifier(context, fObjects)
+TCimXmlReader::TCimXmlReader(TLoadContext& context, const boost::shared_ptr<const TInMemNamespace>& ns, TLoader* loader,
+                             TXmlReader::EParser parser)
+    : fContext(context), fLoader(loader), fPaths(context, ns), fObjects(context, ns, fPaths, parser), fDraft(context),
+      fProperty(context, fObjects, loader, fPaths, fDraft), fQualifier(context, fObjects),
+      fFirstTag(static_cast<std::uint64_t>(context.CountDocuments()) << 32U)
 {
     Reset();
 }
@@ -67,7 +69,7 @@ void TCimXmlReader::OnKnownStart(std::size_t number, const char* name, const cha
     const TCimXmlAttributes known(fContext, element, attributes);
     if (action == TTable::kBeginProperty && fIsDirect) {
         fItem = &fProperty.GetItem();
-        return fContext.Guard([&] { fProperty.BeginInInstance(number, known); });
+        return fContext.Guard([&] { fProperty.BeginInInstance(fFirstTag + number, known); });
     }
     if (action == TTable::kBeginValue) {
         return fContext.Guard([&] { BeginValue(); });
@@ -254,11 +256,11 @@ void TCimXmlReader::BeginClass(const TCimXmlAttributes& attributes)
 
 void TCimXmlReader::EndClass()
 {
-    TCimXmlDraft draft = fDraft.Take();
+    TDraft draft = fDraft.Take();
     if (KeepObject(draft)) {
         return;
     }
-    const TCimXmlContext::TAt at(fContext, draft.place);
+    const TLoadContext::TAt at(fContext, draft.place);
     fLoader->AddClass(std::move(draft));
 }
 
@@ -281,7 +283,7 @@ void TCimXmlReader::EndInstance()
         // Only a loader starts an instance directly, so there is one.
         return fLoader->EndInstance(isNamed ? &fPaths.GetOwnKeys() : nullptr);  // NOLINT(clang-analyzer-core.CallAndMessage)
     }
-    TCimXmlDraft draft = fDraft.Take();
+    TDraft draft = fDraft.Take();
     if (KeepObject(draft)) {
         return;
     }
@@ -292,7 +294,7 @@ void TCimXmlReader::EndInstance()
 }
 
 /// Without a loader, the draft is the embedded object that was asked for; returns false if there is a loader to take it.
-bool TCimXmlReader::KeepObject(TCimXmlDraft& draft)
+bool TCimXmlReader::KeepObject(TDraft& draft)
 {
     if (fLoader != nullptr) {
         return false;

@@ -1,20 +1,21 @@
 #pragma once
 
 #include <boost/smart_ptr/shared_ptr.hpp>
+#include <cstdint>
 #include <string_view>
 #include <vector>
 
 #include "embedded/cimxml/IXmlSink.h"
 #include "embedded/cimxml/TCimXmlAttributes.h"
-#include "embedded/cimxml/TCimXmlContext.h"
 #include "embedded/cimxml/TCimXmlDraftBuilder.h"
 #include "embedded/cimxml/TCimXmlItem.h"
-#include "embedded/cimxml/TCimXmlLoader.h"
 #include "embedded/cimxml/TCimXmlObjectReader.h"
 #include "embedded/cimxml/TCimXmlPathReader.h"
 #include "embedded/cimxml/TCimXmlPropertyReader.h"
 #include "embedded/cimxml/TCimXmlQualifierReader.h"
 #include "embedded/cimxml/TCimXmlTable.h"
+#include "embedded/load/TLoadContext.h"
+#include "embedded/load/TLoader.h"
 
 namespace NORVZEL20 {
 
@@ -26,7 +27,9 @@ namespace NORVZEL20 {
 class TCimXmlReader : public IXmlSink {
   public:
     /// The classes of references are looked up in `ns` (may be null). `context` and `loader` (may be null) must outlive the reader.
-    TCimXmlReader(TCimXmlContext& context, const boost::shared_ptr<const TInMemNamespace>& ns, TCimXmlLoader* loader);
+    /// `parser` reads the texts of embedded objects.
+    TCimXmlReader(TLoadContext& context, const boost::shared_ptr<const TInMemNamespace>& ns, TLoader* loader,
+                  TXmlReader::EParser parser);
 
     void OnStart(const char* name, const char** attributes) override;
     void OnKnownStart(std::size_t number, const char* name, const char** attributes) override;
@@ -78,7 +81,7 @@ class TCimXmlReader : public IXmlSink {
     void EndClass();
     void BeginInstance(const TCimXmlAttributes& attributes);
     void EndInstance();
-    bool KeepObject(TCimXmlDraft& draft);
+    bool KeepObject(TDraft& draft);
     void EndQualifier();
     void BeginValue();
     void EndText();
@@ -86,8 +89,8 @@ class TCimXmlReader : public IXmlSink {
     void ReadError(const TCimXmlAttributes& attributes) const;
     void NoteSkipped(const TCimXmlAttributes& attributes);
 
-    TCimXmlContext& fContext;
-    TCimXmlLoader* fLoader;
+    TLoadContext& fContext;
+    TLoader* fLoader;
     TCimXmlPathReader fPaths;
     TCimXmlObjectReader fObjects;
     TCimXmlDraftBuilder fDraft;
@@ -99,6 +102,7 @@ class TCimXmlReader : public IXmlSink {
     bool fIsDirect = false;                     // the instance is filled without a draft
     bool fIsObjectGiven = false;                // the VALUE.OBJECT that is open has had its class or instance
     boost::shared_ptr<const TEmbeddedObject> fObject;
+    const std::uint64_t fFirstTag;           // added to the numbers of known tags, which each document begins anew
     std::vector<TElement::EElement> fKnown;  // the elements of known tags, by their numbers; kCount if it has not been looked up
 };
 

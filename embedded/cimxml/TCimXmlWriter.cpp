@@ -12,7 +12,7 @@
 #include <utility>
 
 #include "embedded/cimxml/CimXmlFlags.h"
-#include "embedded/cimxml/TCimXmlObjects.h"
+#include "embedded/load/TStoredObjects.h"
 #include "embedded/value/TValueText.h"
 #include "embedded/value/TValueXml.h"
 
@@ -84,7 +84,7 @@ void AppendInstance(std::string& out, const ICIMInstance& instance)
     TValueXml::AppendAttribute(out, "CLASSNAME", instance.GetClass(TCallContext())->GetName(TCallContext()));
     out += '>';
     const auto append = [&](const boost::shared_ptr<ICIMProperty>& property) {
-        TValueXml::AppendProperty(out, TCimXmlObjects::FromProperty(*property));
+        TValueXml::AppendProperty(out, TStoredObjects::FromProperty(*property));
         return true;
     };
     instance.EnumerateProperties(append, TCallContext());
@@ -168,7 +168,7 @@ void TCimXmlWriter::WriteClass(const ICIMClass& cls)
 {
     WriteElement([&](std::string& out) {
         out += "<VALUE.OBJECT>";
-        TValueXml::AppendObject(out, TCimXmlObjects::FromClass(cls));
+        TValueXml::AppendObject(out, TStoredObjects::FromClass(cls));
         out += "</VALUE.OBJECT>\n";
     });
 }

@@ -40,7 +40,7 @@ class CIMDELTA_EXPORT TCimXmlWriter {
     void StartDocument(const std::string& namespaceName = std::string(), const std::string& host = std::string());
     void WriteQualifierDecl(const ICIMQualifierDecl& decl);
     /// One VALUE.OBJECT with the CLASS: its own qualifiers, and the properties and methods that it declares itself. A class of
-    /// another host shows inherited ones too; see TCimXmlObjects::FromClass.
+    /// another host shows inherited ones too; see TStoredObjects::FromClass.
     void WriteClass(const ICIMClass& cls);
     /// One VALUE.OBJECT with the INSTANCE; null properties are written without a value.
     void WriteInstance(const ICIMInstance& instance);

@@ -310,7 +310,7 @@ void TExpatReader::HandOverText()
     }
 }
 
-TXmlPlace TExpatReader::GetPlace() const
+TTextPlace TExpatReader::GetPlace() const
 {
     if (fStopped) {
         return fPlace;

@@ -7,8 +7,8 @@
 #include <string_view>
 
 #include "embedded/cimxml/IXmlSink.h"
-#include "embedded/cimxml/TXmlPlace.h"
 #include "embedded/cimxml/TXmlProgress.h"
+#include "embedded/load/TTextPlace.h"
 
 struct XML_ParserStruct;
 
@@ -38,7 +38,7 @@ class TExpatReader {
     std::size_t GetPending() const;
     void Stop();
     const std::string& GetError() const noexcept { return fError; }
-    TXmlPlace GetPlace() const;
+    TTextPlace GetPlace() const;
 
   private:
     struct TCallbacks;
@@ -69,7 +69,7 @@ class TExpatReader {
     std::exception_ptr fException;
     bool fStopped = false;
     bool fRefusesDocumentTypes = false;
-    TXmlPlace fPlace;  // at which the parse was stopped
+    TTextPlace fPlace;  // at which the parse was stopped
 };
 
 }  // namespace NORVZEL20

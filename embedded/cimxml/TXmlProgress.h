@@ -3,7 +3,7 @@
 #include <cstddef>
 #include <string>
 
-#include "embedded/cimxml/TXmlPlace.h"
+#include "embedded/load/TTextPlace.h"
 
 namespace NORVZEL20 {
 
@@ -12,7 +12,7 @@ struct TXmlProgress {
     std::string tags;       ///< start tags of the open elements; `<a/>` if the outermost one has ended
     std::size_t depth = 0;  ///< open elements
     std::string text;       ///< since the last tag
-    TXmlPlace place;        ///< of the next byte
+    TTextPlace place;       ///< of the next byte
 };
 
 }  // namespace NORVZEL20

@@ -126,7 +126,7 @@ const std::string& TXmlReader::GetError() const noexcept
     return fIsTokenizing ? fgNone : fExpat->GetError();
 }
 
-TXmlPlace TXmlReader::GetPlace() const
+TTextPlace TXmlReader::GetPlace() const
 {
     if (!fIsTokenizing) {
         return fExpat->GetPlace();

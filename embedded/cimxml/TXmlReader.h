@@ -5,7 +5,7 @@
 #include <string>
 
 #include "embedded/cimxml/IXmlSink.h"
-#include "embedded/cimxml/TXmlPlace.h"
+#include "embedded/load/IPlaceSource.h"
 #include "host/Export.h"
 
 namespace NORVZEL20 {
@@ -18,7 +18,7 @@ class TXmlTokenizer;
 /// Events go to a sink. If the sink throws, the parse stops, and Parse, ParseBuffer or Finish throws the same exception.
 /// A document is in error if it refers to an external entity, which is never opened, or exceeds one of the bounds of TXmlLimits.
 /// Threads: use a reader from one thread at a time; different readers may be used concurrently.
-class CIMDELTA_INTERNAL_EXPORT TXmlReader {
+class CIMDELTA_INTERNAL_EXPORT TXmlReader : public IPlaceSource {
   public:
     /// Who reads a document. Events, places, errors and messages are the same; only the time differs.
     enum class EParser : unsigned char {
@@ -30,7 +30,7 @@ class CIMDELTA_INTERNAL_EXPORT TXmlReader {
     explicit TXmlReader(IXmlSink& sink, EParser parser = EParser::kTokenizer);
     TXmlReader(const TXmlReader&) = delete;
     TXmlReader& operator=(const TXmlReader&) = delete;
-    ~TXmlReader();
+    ~TXmlReader() override;
 
     EParser GetParser() const noexcept { return fParser; }
 
@@ -58,7 +58,7 @@ class CIMDELTA_INTERNAL_EXPORT TXmlReader {
     const std::string& GetError() const noexcept;
 
     /// The place of the event or error. Cost: linear in the bytes since the last call.
-    TXmlPlace GetPlace() const;
+    TTextPlace GetPlace() const override;
 
     /// How many tags, comments and declarations the tokenizer has read, since the reader was made.
     std::size_t CountTokens() const noexcept;
@@ -79,7 +79,7 @@ class CIMDELTA_INTERNAL_EXPORT TXmlReader {
     const char* fEncoding = nullptr;
     bool fIsTokenizing = true;
     bool fIsStopped = false;  // while tokenizing
-    TXmlPlace fPlace;         // at which it was stopped
+    TTextPlace fPlace;        // at which it was stopped
 };
 
 }  // namespace NORVZEL20

@@ -8,9 +8,9 @@
 #include "embedded/cimxml/IXmlSink.h"
 #include "embedded/cimxml/TXmlKnownTags.h"
 #include "embedded/cimxml/TXmlOpenElements.h"
-#include "embedded/cimxml/TXmlPlace.h"
 #include "embedded/cimxml/TXmlProgress.h"
 #include "embedded/cimxml/TXmlWindow.h"
+#include "embedded/load/TTextPlace.h"
 
 namespace NORVZEL20 {
 
@@ -42,7 +42,7 @@ class TXmlTokenizer {
     void Stop() noexcept { fIsStopped = true; }
 
     /// The place of the event; between two calls of Scan, of the first byte that has not been read.
-    TXmlPlace GetPlace() noexcept { return fWindow.GetPlace(fEvent != nullptr ? fEvent : fWindow.GetBegin()); }
+    TTextPlace GetPlace() noexcept { return fWindow.GetPlace(fEvent != nullptr ? fEvent : fWindow.GetBegin()); }
 
     /// What has been read before the token that is left to Expat. Call it once. Errors: std::bad_alloc.
     TXmlProgress TakeProgress();

@@ -3,8 +3,30 @@
 #include <cstring>
 
 #include "embedded/cimxml/TXmlSearch.h"
+#include "embedded/value/TUtf8.h"
 
 namespace NORVZEL20 {
+
+namespace {
+
+/// Moves the place over the bytes from `from` to `to`, which are valid UTF-8. `to` must not be between the two bytes of a line
+/// end. The byte at `to` is read.
+void Advance(TTextPlace& place, const char* from, const char* to) noexcept
+{
+    const std::size_t lines = TXmlSearch::CountLineEnds(from, to);
+    const char* lineBegin = from;
+    if (lines > 0) {
+        place.line += lines;
+        place.column = 1;
+        for (lineBegin = to; lineBegin[-1] != '\n' && lineBegin[-1] != '\r'; --lineBegin) {
+        }
+    }
+    for (; lineBegin < to; ++lineBegin) {
+        place.column += TUtf8::IsContinuation(*lineBegin) ? 0 : 1;
+    }
+}
+
+}  // namespace
 
 static_assert(TXmlWindow::kPad > TXmlSearch::kReadsBeyond, "a search stays in the buffer");
 
@@ -12,7 +34,7 @@ void TXmlWindow::Reset() noexcept
 {
     fBegin = fEnd = fBuffer.get();
     fCounted = fBegin;
-    fPlace = TXmlPlace();
+    fPlace = TTextPlace();
 }
 
 /// If little is left, it moves to the front. Otherwise the new buffer is large enough that as much can come before the next move.
@@ -48,10 +70,10 @@ void TXmlWindow::Add(std::size_t length) noexcept
     std::memset(fEnd, 0, kPad);
 }
 
-TXmlPlace TXmlWindow::GetPlace(const char* at) noexcept
+TTextPlace TXmlWindow::GetPlace(const char* at) noexcept
 {
     if (at > fCounted) {
-        fPlace.Advance(fCounted, at);
+        Advance(fPlace, fCounted, at);
         fCounted = at;
     }
     return fPlace;

@@ -3,7 +3,7 @@
 #include <cstddef>
 #include <memory>
 
-#include "embedded/cimxml/TXmlPlace.h"
+#include "embedded/load/TTextPlace.h"
 
 namespace NORVZEL20 {
 
@@ -33,7 +33,7 @@ class TXmlWindow {
 
     /// The place of a byte. Ask in the order of the document: a place in front of the last one cannot be found any more, and the
     /// last one is returned. Cost: linear in the bytes since the last call.
-    TXmlPlace GetPlace(const char* at) noexcept;
+    TTextPlace GetPlace(const char* at) noexcept;
 
   private:
     std::unique_ptr<char[]> fBuffer;
@@ -41,7 +41,7 @@ class TXmlWindow {
     char* fBegin = nullptr;
     char* fEnd = nullptr;
     const char* fCounted = nullptr;  // fPlace is the place of this byte
-    TXmlPlace fPlace;
+    TTextPlace fPlace;
 };
 
 }  // namespace NORVZEL20

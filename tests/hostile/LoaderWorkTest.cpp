@@ -1,8 +1,8 @@
 // Documents that could make the loader repeat work for each instance or class: its steps are counted.
 #include <gtest/gtest.h>
 
-#include "embedded/cimxml/TCimXmlLoader.h"
 #include "embedded/cimxml/TXmlReader.h"
+#include "embedded/load/TLoader.h"
 #include "embedded/value/EraseLast.h"
 
 namespace NORVZEL20 {
@@ -18,11 +18,11 @@ struct TNoSink : IXmlSink {
 /// A loader that gets classes and instances one after the other, as from a document.
 class LoaderWorkTest : public testing::Test {
   protected:
-    LoaderWorkTest() { fContext.SetReader(fXml); }
+    LoaderWorkTest() { fContext.BeginDocument("hostile.xml", fXml); }
 
     void Class(const std::string& name, const std::string& super = std::string())
     {
-        TCimXmlDraft draft{TEmbeddedObject(name, true), {}, {}, {}};
+        TDraft draft{TEmbeddedObject(name, true), {}, {}, {}};
         draft.object.SetSuperClassName(super);
         fLoader.AddClass(std::move(draft));
     }
@@ -38,8 +38,8 @@ class LoaderWorkTest : public testing::Test {
     boost::shared_ptr<TInMemNamespace> fNamespace = TInMemNamespace::Create("root/cimv2");
     TNoSink fSink;
     TXmlReader fXml{fSink};
-    TCimXmlContext fContext{"hostile.xml"};
-    TCimXmlLoader fLoader{fContext, fNamespace};
+    TLoadContext fContext;
+    TLoader fLoader{fContext, fNamespace};
 };
 
 std::string Name(std::size_t number)

@@ -4,7 +4,7 @@
 #include <string>
 #include <vector>
 
-#include "embedded/cimxml/TCimXmlContext.h"
+#include "embedded/load/TLoadContext.h"
 #include "host/TZELException.h"
 #include "tests/embedded/cimxml/TLoading.h"
 
@@ -215,10 +215,18 @@ TEST(BadInputTest, AFailedLoadTakesBackWhatItAddedToClassesThatWereThere)
     EXPECT_EQ("root/cimv2:A.Id=\"old\"\n", loading.PathsOf("A"));
 }
 
-TEST(CimXmlContextTest, WhatTheNamespaceRefusesEndsTheLoadAtItsPlace)
+/// A reader that has read nothing.
+class TNowhere : public IPlaceSource {
+  public:
+    TTextPlace GetPlace() const override { return {}; }
+};
+
+TEST(LoadContextTest, WhatTheNamespaceRefusesEndsTheLoadAtItsPlace)
 {
-    TCimXmlContext context("doc.xml");
-    const TCimXmlContext::TAt at(context, {3, 4});
+    TLoadContext context;
+    const TNowhere nowhere;
+    context.BeginDocument("doc.xml", nowhere);
+    const TLoadContext::TAt at(context, {0, {3, 4}});
     const auto errorOf = [&context](const TZELException& thrown) {
         try {
             context.Guard([&] { throw thrown; });

@@ -4,7 +4,7 @@
 #include <string>
 #include <vector>
 
-#include "embedded/cimxml/TTextPool.h"
+#include "embedded/load/TTextPool.h"
 #include "embedded/value/TValueAccess.h"
 #include "tests/embedded/cimxml/TLoading.h"
 #include "tests/support/HeapInUse.h"

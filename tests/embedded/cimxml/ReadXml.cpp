@@ -5,7 +5,7 @@
 
 #include "embedded/cimxml/TCimXmlPopulator.h"
 #include "embedded/cimxml/TCimXmlWriter.h"
-#include "embedded/cimxml/TPopulateError.h"
+#include "embedded/load/TPopulateError.h"
 #include "embedded/store/TInMemNamespace.h"
 
 namespace NORVZEL20 {
@@ -78,7 +78,7 @@ class TEventLog : public IXmlSink {
         if (fHasLineEndBehindRoot && fDepth == 0) {
             return;
         }
-        const TXmlPlace place = fReader.GetPlace();
+        const TTextPlace place = fReader.GetPlace();
         fText += " @" + std::to_string(place.line) + ":" + std::to_string(place.column) + "\n";
     }
 

@@ -3,7 +3,7 @@
 #include <boost/smart_ptr/shared_ptr.hpp>
 #include <string>
 
-#include "embedded/cimxml/TLoadReport.h"
+#include "embedded/load/TLoadReport.h"
 #include "embedded/store/TInMemNamespace.h"
 
 namespace NORVZEL20 {

@@ -10,10 +10,10 @@
 #include <utility>
 #include <vector>
 
-#include "embedded/cimxml/TCimXmlClassQueue.h"
-#include "embedded/cimxml/TCimXmlLateInstances.h"
-#include "embedded/cimxml/TCimXmlLayout.h"
-#include "embedded/cimxml/TCimXmlTarget.h"
+#include "embedded/load/TClassQueue.h"
+#include "embedded/load/TLateInstances.h"
+#include "embedded/load/TLoadLayout.h"
+#include "embedded/load/TLoadTarget.h"
 
 namespace NORVZEL20 {
 
@@ -21,51 +21,51 @@ namespace NORVZEL20 {
 ///
 /// Order of calls: Begin; FindProperty and SetProperty for each property, or Fill; Take.
 /// Errors: every operation fails through the context.
-class TCimXmlInstanceBuilder {
+class TInstanceBuilder {
   public:
     using TOwnKeys = std::vector<std::pair<std::string, TCIMValue>>;
     /// Returns a value with those of its texts read that are embedded objects.
     using TReadObjects = boost::function<TCIMValue(const TCIMValue&)>;
 
     /// All arguments must outlive the builder.
-    TCimXmlInstanceBuilder(TCimXmlContext& context, TInMemNamespace& ns, TInMemStaging& staging, TCimXmlClassQueue& classes,
-                           TCimXmlLateInstances& late) noexcept
+    TInstanceBuilder(TLoadContext& context, TInMemNamespace& ns, TInMemStaging& staging, TClassQueue& classes,
+                     TLateInstances& late) noexcept
         : fContext(context), fNamespace(ns), fStaging(staging), fClasses(classes), fLate(late)
     {}
 
     /// Starts an instance; false if its class is not known yet.
     bool Begin(const char* className);
     /// Errors: kNotFound (15) if the class has no such property, kParseError (9) if the instance has had it already.
-    TCimXmlTarget& FindProperty(const char* name);
+    TLoadTarget& FindProperty(const char* name);
     /// As FindProperty, for the property that is likely to come next. Returns null if the property did not note that tag last
     /// time, or if the instance has the property already.
-    TCimXmlTarget* TakeLikely(std::size_t tagNumber) noexcept
+    TLoadTarget* TakeLikely(std::uint64_t tagNumber) noexcept
     {
-        TCimXmlTarget* const target = fExpected;
+        TLoadTarget* const target = fExpected;
         return target != nullptr && target->tag.number == tagNumber && Take(*target) ? target : nullptr;
     }
     /// `isUnsettled` says that references in the value may have to be written again (see TCimXmlPathReader::TakeMetUnsettled). A
     /// value of another type is converted. Errors: kTypeMismatch (13) if that would lose something; kParseError (9) if the property
     /// is static and another instance has given it another value.
-    void SetProperty(const TCimXmlTarget& target, TCIMValue&& value, bool isUnsettled);
+    void SetProperty(const TLoadTarget& target, TCIMValue&& value, bool isUnsettled);
     /// As SetProperty with a value that is not unsettled and not null. Returns false if there is more to do than to keep the value,
     /// which is then as it was; otherwise it is null now.
-    bool FillProperty(const TCimXmlTarget& target, TCIMValue& value) noexcept
+    bool FillProperty(const TLoadTarget& target, TCIMValue& value) noexcept
     {
         return target.isKeptAsIs && value.GetType() == target.type && fInstance->FillSlot(target.slot, value);
     }
     /// Begins the instance and sets all its properties. Call it for a draft when the document has ended. Errors: kNotFound (15) if
     /// its class is not declared; those of FindProperty and SetProperty.
-    void Fill(const TCimXmlDraft& draft, const TReadObjects& readObjects);
+    void Fill(const TDraft& draft, const TReadObjects& readObjects);
     /// Ends the instance. `ownKeys` (may be null) are the keys of the name in front of it, for those that it leaves out.
     boost::shared_ptr<TInMemInstance> Take(const TOwnKeys* ownKeys);
 
-    /// Whether the instances of the last instance's class are held; see TCimXmlLateInstances::Hold.
+    /// Whether the instances of the last instance's class are held; see TLateInstances::Hold.
     bool IsHeld() const noexcept { return fLayout->isHeld; }
 
   private:
     /// Notes that the instance has the property; false if it has had it.
-    bool Take(TCimXmlTarget& target) noexcept
+    bool Take(TLoadTarget& target) noexcept
     {
         if (target.given == fNumber) {
             return false;
@@ -74,23 +74,23 @@ class TCimXmlInstanceBuilder {
         fExpected = target.next;
         return true;
     }
-    TCimXmlLayout* FindLayout(const char* className);
-    void SetStatic(const TCimXmlTarget& target, const TCIMValue& value);
-    TCIMValue Convert(const TCimXmlTarget& target, const TCIMValue& value);
+    TLoadLayout* FindLayout(const char* className);
+    void SetStatic(const TLoadTarget& target, const TCIMValue& value);
+    TCIMValue Convert(const TLoadTarget& target, const TCIMValue& value);
     bool Localize(TCIMValue& value) const;
     void FillKeys(const TOwnKeys& keys);
 
-    TCimXmlContext& fContext;
+    TLoadContext& fContext;
     TInMemNamespace& fNamespace;
     TInMemStaging& fStaging;
-    TCimXmlClassQueue& fClasses;
-    TCimXmlLateInstances& fLate;
-    TNameMap<std::unique_ptr<TCimXmlLayout>> fLayouts;  // by class name
-    TCimXmlLayout* fLayout = nullptr;                   // of the instance being filled, or of the last one
+    TClassQueue& fClasses;
+    TLateInstances& fLate;
+    TNameMap<std::unique_ptr<TLoadLayout>> fLayouts;  // by class name
+    TLoadLayout* fLayout = nullptr;                   // of the instance being filled, or of the last one
     boost::shared_ptr<TInMemInstance> fInstance;
     std::set<const TInMemPropertyDecl*> fGivenStatics;  // those that an instance has given a value, or NULL
     std::uint32_t fNumber = 0;                          // of the instance, from 1
-    TCimXmlTarget* fExpected = nullptr;                 // the property that is likely to come next, or null
+    TLoadTarget* fExpected = nullptr;                   // the property that is likely to come next, or null
 };
 
 }  // namespace NORVZEL20

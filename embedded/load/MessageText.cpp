@@ -1,4 +1,4 @@
-#include "embedded/cimxml/MessageText.h"
+#include "embedded/load/MessageText.h"
 
 #include "embedded/value/TUtf8.h"
 

@@ -3,34 +3,31 @@
 // What is read is added to the namespace at once, through a staging that remembers it. If anything fails, the exception passes
 // through here, the staging is destroyed without Commit, and takes everything out again. What cannot be added yet waits:
 //
-// 1. Classes wait in TCimXmlClassQueue until an instance needs them or the document ends.
-// 2. Instances of a declared class are filled by TCimXmlInstanceBuilder while they are read, and added at their end.
-// 3. Instances that need a class which has not come yet are kept in TCimXmlLateInstances.
+// 1. Classes wait in TClassQueue until an instance needs them or the document ends.
+// 2. Instances of a declared class are filled by TInstanceBuilder while they are read, and added at their end.
+// 3. Instances that need a class which has not come yet are kept in TLateInstances.
 // 4. When the document has ended, Finish declares the remaining classes and fills the instances that waited as drafts. Then all
 //    references have been seen, so it is decided which are local; the noted ones are written again, and the held instances, to
 //    which those of the drafts belong by now, are added. What is still missing then is an error.
-#include "embedded/cimxml/TCimXmlLoader.h"
+#include "embedded/load/TLoader.h"
 
 #include <boost/smart_ptr/make_shared.hpp>
 #include <utility>
 
-#include "embedded/cimxml/MessageText.h"
-#include "embedded/cimxml/ReadObjectKey.h"
+#include "embedded/load/MessageText.h"
 
 namespace NORVZEL20 {
 
 using EStatus = TZELStatusCode::EStatusCode;
 
-TCimXmlLoader::TCimXmlLoader(TCimXmlContext& context, const boost::shared_ptr<TInMemNamespace>& ns)
+TLoader::TLoader(TLoadContext& context, const boost::shared_ptr<TInMemNamespace>& ns)
     : fContext(context), fNamespace(ns), fStaging(ns), fClasses(context, *ns, fStaging),
       fBuilder(context, *ns, fStaging, fClasses, fLate)
-{
-    ns->SetObjectReader(&ReadObjectKey);
-}
+{}
 
-TCimXmlLoader::~TCimXmlLoader() = default;
+TLoader::~TLoader() = default;
 
-void TCimXmlLoader::AddQualifierDecl(const TCimXmlQualifierDraft& draft)
+void TLoader::AddQualifierDecl(const TQualifierDraft& draft)
 {
     const boost::shared_ptr<TInMemQualifierDecl> known = fNamespace->FindQualifierDecl(draft.name);
     if (!known) {
@@ -45,12 +42,12 @@ void TCimXmlLoader::AddQualifierDecl(const TCimXmlQualifierDraft& draft)
     fContext.Tolerate("repeated qualifier", "qualifier " + Quote(draft.name) + " is declared again; the first declaration stands");
 }
 
-void TCimXmlLoader::AddClass(TCimXmlDraft draft)
+void TLoader::AddClass(TDraft draft)
 {
     fClasses.Add(std::move(draft));
 }
 
-bool TCimXmlLoader::BeginInstance(const char* className)
+bool TLoader::BeginInstance(const char* className)
 {
     if (!fLate.IsWaiting() && fBuilder.Begin(className)) {
         return true;
@@ -59,7 +56,7 @@ bool TCimXmlLoader::BeginInstance(const char* className)
     return false;
 }
 
-void TCimXmlLoader::EndInstance(const TOwnKeys* ownKeys)
+void TLoader::EndInstance(const TOwnKeys* ownKeys)
 {
     const boost::shared_ptr<TInMemInstance> instance = fBuilder.Take(ownKeys);
     if (fBuilder.IsHeld() || fHasEnded) {
@@ -73,7 +70,7 @@ void TCimXmlLoader::EndInstance(const TOwnKeys* ownKeys)
     }
 }
 
-void TCimXmlLoader::Add(const boost::shared_ptr<TInMemInstance>& instance)
+void TLoader::Add(const boost::shared_ptr<TInMemInstance>& instance)
 {
     try {
         fStaging.AddInstance(instance);
@@ -83,7 +80,7 @@ void TCimXmlLoader::Add(const boost::shared_ptr<TInMemInstance>& instance)
 }
 
 /// The namespace says what it refuses; the message of a load also says what to do.
-void TCimXmlLoader::Explain(const TZELException& error, const TInMemInstance& instance) const
+void TLoader::Explain(const TZELException& error, const TInMemInstance& instance) const
 {
     const EStatus status = error.GetStatusCode().GetStatus();
     const std::string ofClass = " of class " + Quote(instance.GetInMemClass()->GetName());
@@ -100,13 +97,13 @@ void TCimXmlLoader::Explain(const TZELException& error, const TInMemInstance& in
     fContext.Fail(status, "found an instance" + ofClass + " that cannot be added: " + error.what());
 }
 
-void TCimXmlLoader::Finish(const TReadObjects& readObjects)
+void TLoader::Finish(const TReadObjects& readObjects)
 {
     fHasEnded = true;
     fClasses.DeclareAll();
     fLate.AdaptReferences(fContext.GetOwnPlace(), *fNamespace, fClasses.CountDeclared());
-    for (const TCimXmlDraft& draft : fLate.TakeDrafts()) {
-        const TCimXmlContext::TAt at(fContext, draft.place);
+    for (const TDraft& draft : fLate.TakeDrafts()) {
+        const TLoadContext::TAt at(fContext, draft.place);
         fBuilder.Fill(draft, readObjects);
         EndInstance(&draft.ownKeys);
     }
@@ -114,20 +111,20 @@ void TCimXmlLoader::Finish(const TReadObjects& readObjects)
     fOwnPlace = fContext.GetOwnPlace().GetNamed();
     fClasses.MakeDefaultsLocal();
     fLate.MakeReferencesLocal(fContext.GetOwnPlace());
-    for (const TCimXmlLateInstances::THeld& held : fLate.TakeHeld()) {
-        const TCimXmlContext::TAt at(fContext, held.place);
+    for (const TLateInstances::THeld& held : fLate.TakeHeld()) {
+        const TLoadContext::TAt at(fContext, held.place);
         Add(held.instance);
     }
 }
 
 /// References that turn up later, when text becomes one, are to be local too, so the namespace needs what the load has found out.
-void TCimXmlLoader::Commit() noexcept
+void TLoader::Commit() noexcept
 {
     fNamespace->SetOwnPlace(std::move(fOwnPlace));
     fStaging.Commit();
 }
 
-std::vector<boost::shared_ptr<ICIMElement>> TCimXmlLoader::TakeElements()
+std::vector<boost::shared_ptr<ICIMElement>> TLoader::TakeElements()
 {
     if (!fKeep) {
         return {};

@@ -2,7 +2,7 @@
 
 #include <string>
 
-#include "embedded/cimxml/TLoadReport.h"
+#include "embedded/load/TLoadReport.h"
 #include "embedded/store/TOwnPlace.h"
 #include "embedded/value/TNameText.h"
 #include "host/Export.h"
@@ -15,7 +15,7 @@ namespace NORVZEL20 {
 /// Until Decide is called, some references are open: what the rest of the document names decides about them. They keep their
 /// namespace and host, and have to be passed to MakeLocal again after Decide.
 /// Threads: one at a time, as the load that it belongs to.
-class CIMDELTA_INTERNAL_EXPORT TCimXmlOwnPlace {
+class CIMDELTA_INTERNAL_EXPORT TOwnPlaceSearch {
   public:
     enum EAnswer : unsigned char {
         kOwn,
@@ -24,7 +24,7 @@ class CIMDELTA_INTERNAL_EXPORT TCimXmlOwnPlace {
     };
 
     /// `report` says what the document names for itself so far. It must outlive this.
-    explicit TCimXmlOwnPlace(TLoadReport& report) noexcept : fReport(report) {}
+    explicit TOwnPlaceSearch(TLoadReport& report) noexcept : fReport(report) {}
 
     /// Whose a path with that namespace and host (both may be empty) is. Notes what Decide needs. A path without a namespace is
     /// kForeign, since there is nothing to take out of it.

@@ -6,11 +6,11 @@
 //
 // Names are checked here, because here they become part of paths. Limits are checked with inherited parts included, which a draft
 // cannot know: every instance of every subclass has room for each property.
-#include "embedded/cimxml/TCimXmlClassMaker.h"
+#include "embedded/load/TClassMaker.h"
 
 #include <boost/smart_ptr/make_shared.hpp>
 
-#include "embedded/cimxml/MessageText.h"
+#include "embedded/load/MessageText.h"
 #include "embedded/store/TInMemQualifier.h"
 #include "embedded/store/TSchemaLimits.h"
 #include "embedded/value/TValueText.h"
@@ -19,7 +19,7 @@ namespace NORVZEL20 {
 
 using EStatus = TZELStatusCode::EStatusCode;
 
-boost::shared_ptr<TInMemClass> TCimXmlClassMaker::Make(const TCimXmlDraft& draft, const boost::shared_ptr<TInMemClass>& super)
+boost::shared_ptr<TInMemClass> TClassMaker::Make(const TDraft& draft, const boost::shared_ptr<TInMemClass>& super)
 {
     const TEmbeddedObject& object = draft.object;
     if (super && super->CountSuperClasses() >= TSchemaLimits::kMaxSuperClasses) {
@@ -31,7 +31,7 @@ boost::shared_ptr<TInMemClass> TCimXmlClassMaker::Make(const TCimXmlDraft& draft
     const boost::shared_ptr<TInMemClass> cls = fNamespace.AllocateInMemClass(object.GetClassName(), super);
     AddQualifiers(*cls, object.GetQualifiers(), super ? &super->GetQualifiers() : nullptr);
     for (std::size_t index = 0; index < object.GetProperties().size(); ++index) {
-        const TCimXmlContext::TAt at(fContext, draft.propertyPlaces[index]);
+        const TLoadContext::TAt at(fContext, draft.propertyPlaces[index]);
         AddProperty(*cls, object.GetProperties()[index], super.get());
         if (cls->GetLayout().GetOrder().size() > TSchemaLimits::kMaxProperties) {
             FailTooMany(TSchemaLimits::kMaxProperties, "properties", object.GetClassName());
@@ -51,19 +51,19 @@ boost::shared_ptr<TInMemClass> TCimXmlClassMaker::Make(const TCimXmlDraft& draft
     return cls;
 }
 
-void TCimXmlClassMaker::FailTooMany(std::size_t most, const char* what, const std::string& className) const
+void TClassMaker::FailTooMany(std::size_t most, const char* what, const std::string& className) const
 {
     fContext.Fail(EStatus::kParseError, "found more than " + std::to_string(most) + " " + what + " in class " + Quote(className) +
                                             ", inherited ones included; split it");
 }
 
-void TCimXmlClassMaker::FailSecond(const char* what, const std::string& name, const TInMemClass& cls) const
+void TClassMaker::FailSecond(const char* what, const std::string& name, const TInMemClass& cls) const
 {
     fContext.Fail(EStatus::kParseError,
                   std::string("found a second declaration of ") + what + " " + Quote(name) + " in class " + Quote(cls.GetName()));
 }
 
-void TCimXmlClassMaker::AddProperty(TInMemClass& cls, const TEmbeddedObject::TProperty& property, const TInMemClass* super)
+void TClassMaker::AddProperty(TInMemClass& cls, const TEmbeddedObject::TProperty& property, const TInMemClass* super)
 {
     fContext.CheckName("property", property.name);
     const TCIMValue::TCIMType type = property.value.GetType();
@@ -88,7 +88,7 @@ void TCimXmlClassMaker::AddProperty(TInMemClass& cls, const TEmbeddedObject::TPr
     }
 }
 
-void TCimXmlClassMaker::AddMethod(TInMemClass& cls, const TEmbeddedObject::TMethod& method, const TInMemClass* super)
+void TClassMaker::AddMethod(TInMemClass& cls, const TEmbeddedObject::TMethod& method, const TInMemClass* super)
 {
     const boost::shared_ptr<TInMemMethodDecl> inherited =
         super != nullptr ? super->GetMethods().Find(method.name) : boost::shared_ptr<TInMemMethodDecl>();
@@ -110,7 +110,7 @@ void TCimXmlClassMaker::AddMethod(TInMemClass& cls, const TEmbeddedObject::TMeth
 }
 
 template <class TElement>
-void TCimXmlClassMaker::AddQualifiers(TElement& element, const TQualifiers& qualifiers, const TInMemQualifierSet* inherited)
+void TClassMaker::AddQualifiers(TElement& element, const TQualifiers& qualifiers, const TInMemQualifierSet* inherited)
 {
     if (qualifiers.size() + (inherited != nullptr ? inherited->CountAll() : 0) > TSchemaLimits::kMaxQualifiers) {
         fContext.Fail(EStatus::kParseError, "found more than " + std::to_string(TSchemaLimits::kMaxQualifiers) +
@@ -131,7 +131,7 @@ void TCimXmlClassMaker::AddQualifiers(TElement& element, const TQualifiers& qual
 }
 
 /// Notes what is odd about a qualifier. Real servers write undeclared ones, published schemas restate flavors.
-void TCimXmlClassMaker::NoteQualifier(const TEmbeddedObject::TQualifier& qualifier, const ICIMQualifier* inherited)
+void TClassMaker::NoteQualifier(const TEmbeddedObject::TQualifier& qualifier, const ICIMQualifier* inherited)
 {
     if (!fNamespace.FindQualifierDecl(qualifier.name)) {
         fContext.Tolerate("undeclared qualifier",

@@ -7,9 +7,9 @@
 namespace NORVZEL20 {
 
 /// Classes and properties of a namespace as free-standing objects, for writing and comparing.
-class TCimXmlObjects {
+class TStoredObjects {
   public:
-    TCimXmlObjects() = delete;
+    TStoredObjects() = delete;
 
     /// What the class itself declares or overrides, with its own qualifiers. For a class of another host, which the interfaces show
     /// only in part: everything that it has, inherited elements included, and methods without parameters.

@@ -2,8 +2,8 @@
 
 #include <boost/smart_ptr/shared_ptr.hpp>
 
-#include "embedded/cimxml/TCimXmlContext.h"
-#include "embedded/cimxml/TCimXmlDraft.h"
+#include "embedded/load/TDraft.h"
+#include "embedded/load/TLoadContext.h"
 #include "embedded/store/TInMemClass.h"
 #include "embedded/store/TInMemNamespace.h"
 
@@ -15,13 +15,13 @@ namespace NORVZEL20 {
 /// Qualifiers without a declaration, and restated ones with another flavor, are tolerated.
 /// Errors: fails through the context with kParseError (9) if a name cannot stand in a path, a part is declared twice or the class
 /// would exceed TSchemaLimits, with kTypeMismatch (13) if a property has another type than in a superclass.
-class TCimXmlClassMaker {
+class TClassMaker {
   public:
     /// `ns` is what the class is for. Both arguments must outlive the maker.
-    TCimXmlClassMaker(TCimXmlContext& context, TInMemNamespace& ns) : fContext(context), fNamespace(ns) {}
+    TClassMaker(TLoadContext& context, TInMemNamespace& ns) : fContext(context), fNamespace(ns) {}
 
     /// A class that is not added to the namespace yet; `super` is null for a top-level class.
-    boost::shared_ptr<TInMemClass> Make(const TCimXmlDraft& draft, const boost::shared_ptr<TInMemClass>& super);
+    boost::shared_ptr<TInMemClass> Make(const TDraft& draft, const boost::shared_ptr<TInMemClass>& super);
 
   private:
     using TQualifiers = std::vector<TEmbeddedObject::TQualifier>;
@@ -34,7 +34,7 @@ class TCimXmlClassMaker {
     void AddProperty(TInMemClass& cls, const TEmbeddedObject::TProperty& property, const TInMemClass* super);
     void AddMethod(TInMemClass& cls, const TEmbeddedObject::TMethod& method, const TInMemClass* super);
 
-    TCimXmlContext& fContext;
+    TLoadContext& fContext;
     TInMemNamespace& fNamespace;
 };
 

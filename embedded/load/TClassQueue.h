@@ -4,8 +4,8 @@
 #include <cstddef>
 #include <vector>
 
-#include "embedded/cimxml/TCimXmlContext.h"
-#include "embedded/cimxml/TCimXmlDraft.h"
+#include "embedded/load/TDraft.h"
+#include "embedded/load/TLoadContext.h"
 #include "embedded/store/TInMemNamespace.h"
 #include "embedded/store/TInMemStaging.h"
 #include "embedded/value/TNameText.h"
@@ -17,27 +17,27 @@ namespace NORVZEL20 {
 /// The classes that a document declares. They may come in any order: each waits until it is needed or the document ends.
 ///
 /// Errors: every operation but the counts fails through the context, at the place of the class concerned.
-class CIMDELTA_INTERNAL_EXPORT TCimXmlClassQueue {
+class CIMDELTA_INTERNAL_EXPORT TClassQueue {
   public:
     /// All arguments must outlive the queue. `staging` is one of `ns`.
-    TCimXmlClassQueue(TCimXmlContext& context, TInMemNamespace& ns, TInMemStaging& staging) noexcept
+    TClassQueue(TLoadContext& context, TInMemNamespace& ns, TInMemStaging& staging) noexcept
         : fContext(context), fNamespace(ns), fStaging(staging)
     {}
 
     /// Queues a class. One that is declared already, here or in the namespace, is tolerated and left out if both declarations are
     /// the same. Errors: kAlreadyExists (12) if they differ.
-    void Add(TCimXmlDraft draft);
+    void Add(TDraft draft);
 
     /// The class of that name, declared now if it is in the queue; null if it or one of its superclasses is not known yet.
     /// Cost: constant for a class of the namespace; each class in the queue is tried a bounded number of times, however often this
-    /// is called. Errors: those of TCimXmlClassMaker.
+    /// is called. Errors: those of TClassMaker.
     boost::shared_ptr<TInMemClass> Find(const char* name);
 
     /// Declares all classes that wait. Call it at the end of the document. Errors: kNotFound (15) for a class whose superclass
-    /// never came, or which is below itself; those of TCimXmlClassMaker.
+    /// never came, or which is below itself; those of TClassMaker.
     void DeclareAll();
 
-    /// Takes the document's own namespace out of the references in default values. Call it after TCimXmlOwnPlace::Decide.
+    /// Takes the document's own namespace out of the references in default values. Call it after TOwnPlaceSearch::Decide.
     void MakeDefaultsLocal();
 
     /// How many classes have been declared.
@@ -56,13 +56,13 @@ class CIMDELTA_INTERNAL_EXPORT TCimXmlClassQueue {
     };
 
     struct TEntry {
-        TCimXmlDraft draft;
+        TDraft draft;
         EState state;
     };
 
     /// What is said of a class that is declared already: each text follows the class's name.
     struct TRepetition {
-        const char* kind;       ///< see TCimXmlContext::Tolerate
+        const char* kind;       ///< see TLoadContext::Tolerate
         const char* tolerated;  ///< if both declarations are the same
         const char* conflict;   ///< if they differ
     };
@@ -72,9 +72,9 @@ class CIMDELTA_INTERNAL_EXPORT TCimXmlClassQueue {
     void DeclareStuck(const char* name);
     void Declare(std::size_t number);
     std::vector<std::size_t> CollectChain(std::size_t number, boost::shared_ptr<TInMemClass>& super);
-    [[noreturn]] void Refuse(const TCimXmlDraft& draft) const;
+    [[noreturn]] void Refuse(const TDraft& draft) const;
 
-    TCimXmlContext& fContext;
+    TLoadContext& fContext;
     TInMemNamespace& fNamespace;
     TInMemStaging& fStaging;
     std::vector<TEntry> fEntries;    // in the document's order

@@ -4,7 +4,7 @@
 // do not show that difference; they do not show parameters, array sizes and classes of references either. So the functions below
 // check whether an object is one of this host (`inMemory` is not null). If so, they ask it directly; otherwise they copy what the
 // interfaces show.
-#include "embedded/cimxml/TCimXmlObjects.h"
+#include "embedded/load/TStoredObjects.h"
 
 #include <type_traits>
 #include <utility>
@@ -120,7 +120,7 @@ std::vector<TElement> OwnOf(const std::vector<TElement>& elements)
 
 }  // namespace
 
-TEmbeddedObject TCimXmlObjects::WithoutInherited(const TEmbeddedObject& cls)
+TEmbeddedObject TStoredObjects::WithoutInherited(const TEmbeddedObject& cls)
 {
     TEmbeddedObject object(cls.GetClassName(), true);
     object.SetSuperClassName(cls.GetSuperClassName());
@@ -136,7 +136,7 @@ TEmbeddedObject TCimXmlObjects::WithoutInherited(const TEmbeddedObject& cls)
     return object;
 }
 
-TEmbeddedObject TCimXmlObjects::FromClass(const ICIMClass& cls)
+TEmbeddedObject TStoredObjects::FromClass(const ICIMClass& cls)
 {
     TEmbeddedObject object(cls.GetName(TCallContext()), true);
     if (const boost::shared_ptr<ICIMClass> super = cls.GetSuperClass(TCallContext())) {
@@ -154,7 +154,7 @@ TEmbeddedObject TCimXmlObjects::FromClass(const ICIMClass& cls)
     return object;
 }
 
-TEmbeddedObject::TProperty TCimXmlObjects::FromProperty(const ICIMProperty& property)
+TEmbeddedObject::TProperty TStoredObjects::FromProperty(const ICIMProperty& property)
 {
     const boost::shared_ptr<const ICIMPropertyDecl> decl = property.GetPropertyDecl(TCallContext());
     TEmbeddedObject::TProperty result;

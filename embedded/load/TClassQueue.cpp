@@ -7,19 +7,19 @@
 //
 // Stuck classes are not tried again for every instance, which would take time in proportion to classes times instances. They
 // become new again only when an instance needs that very class, and when the document ends.
-#include "embedded/cimxml/TCimXmlClassQueue.h"
+#include "embedded/load/TClassQueue.h"
 
 #include <utility>
 
-#include "embedded/cimxml/MessageText.h"
-#include "embedded/cimxml/TCimXmlClassMaker.h"
-#include "embedded/cimxml/TCimXmlObjects.h"
+#include "embedded/load/MessageText.h"
+#include "embedded/load/TClassMaker.h"
+#include "embedded/load/TStoredObjects.h"
 
 namespace NORVZEL20 {
 
 using EStatus = TZELStatusCode::EStatusCode;
 
-void TCimXmlClassQueue::Add(TCimXmlDraft draft)
+void TClassQueue::Add(TDraft draft)
 {
     static constexpr TRepetition kInDocument{"repeated class", " is declared again; the first declaration stands",
                                              " a second time, declared differently; remove one of the two"};
@@ -31,7 +31,7 @@ void TCimXmlClassQueue::Add(TCimXmlDraft draft)
         return NoteRepeated(name, fEntries[repeated->second].draft.object == draft.object, kInDocument);
     }
     if (const boost::shared_ptr<TInMemClass> known = fNamespace.FindClass(name)) {
-        const bool isSame = TCimXmlObjects::FromClass(*known) == TCimXmlObjects::WithoutInherited(draft.object);
+        const bool isSame = TStoredObjects::FromClass(*known) == TStoredObjects::WithoutInherited(draft.object);
         return NoteRepeated(name, isSame, kInNamespace);
     }
     fNumbers.emplace(name, fEntries.size());
@@ -39,7 +39,7 @@ void TCimXmlClassQueue::Add(TCimXmlDraft draft)
     ++fContext.GetReport().classes;
 }
 
-void TCimXmlClassQueue::NoteRepeated(const std::string& name, bool isSame, const TRepetition& repetition)
+void TClassQueue::NoteRepeated(const std::string& name, bool isSame, const TRepetition& repetition)
 {
     const std::string shown = "class " + Quote(name);
     if (!isSame) {
@@ -48,7 +48,7 @@ void TCimXmlClassQueue::NoteRepeated(const std::string& name, bool isSame, const
     fContext.Tolerate(repetition.kind, shown + repetition.tolerated);
 }
 
-boost::shared_ptr<TInMemClass> TCimXmlClassQueue::Find(const char* name)
+boost::shared_ptr<TInMemClass> TClassQueue::Find(const char* name)
 {
     boost::shared_ptr<TInMemClass> cls = fNamespace.FindClass(name);
     if (!cls) {
@@ -59,7 +59,7 @@ boost::shared_ptr<TInMemClass> TCimXmlClassQueue::Find(const char* name)
     return cls;
 }
 
-void TCimXmlClassQueue::DeclareNew()
+void TClassQueue::DeclareNew()
 {
     for (; fFirstNew < fEntries.size(); ++fFirstNew) {
         Declare(fFirstNew);
@@ -67,7 +67,7 @@ void TCimXmlClassQueue::DeclareNew()
 }
 
 /// Tries a stuck class again, because its superclass may have come meanwhile.
-void TCimXmlClassQueue::DeclareStuck(const char* name)
+void TClassQueue::DeclareStuck(const char* name)
 {
     const auto known = fNumbers.find(name);
     if (known == fNumbers.end()) {
@@ -84,7 +84,7 @@ void TCimXmlClassQueue::DeclareStuck(const char* name)
 }
 
 /// The class and those of its superclasses that are new, upwards; `super` is what is declared above them.
-std::vector<std::size_t> TCimXmlClassQueue::CollectChain(std::size_t number, boost::shared_ptr<TInMemClass>& super)
+std::vector<std::size_t> TClassQueue::CollectChain(std::size_t number, boost::shared_ptr<TInMemClass>& super)
 {
     std::vector<std::size_t> chain;
     for (std::size_t next = number; fEntries[next].state == kNew;) {
@@ -103,7 +103,7 @@ std::vector<std::size_t> TCimXmlClassQueue::CollectChain(std::size_t number, boo
 }
 
 /// Declares a class after those of its superclasses that wait, or none of them if the topmost is not known yet.
-void TCimXmlClassQueue::Declare(std::size_t number)
+void TClassQueue::Declare(std::size_t number)
 {
     ++fTried;
     boost::shared_ptr<TInMemClass> super;
@@ -113,9 +113,9 @@ void TCimXmlClassQueue::Declare(std::size_t number)
         if (!super && !entry.draft.object.GetSuperClassName().empty()) {
             continue;
         }
-        const TCimXmlContext::TAt at(fContext, entry.draft.place);
+        const TLoadContext::TAt at(fContext, entry.draft.place);
         fContext.Guard([&] {
-            super = TCimXmlClassMaker(fContext, fNamespace).Make(entry.draft, super);
+            super = TClassMaker(fContext, fNamespace).Make(entry.draft, super);
             fStaging.AddClass(super);
         });
         entry.state = kDeclared;
@@ -123,7 +123,7 @@ void TCimXmlClassQueue::Declare(std::size_t number)
     }
 }
 
-void TCimXmlClassQueue::DeclareAll()
+void TClassQueue::DeclareAll()
 {
     for (TEntry& entry : fEntries) {
         if (entry.state == kStuck) {
@@ -139,7 +139,7 @@ void TCimXmlClassQueue::DeclareAll()
     }
 }
 
-void TCimXmlClassQueue::MakeDefaultsLocal()
+void TClassQueue::MakeDefaultsLocal()
 {
     if (!fContext.GetOwnPlace().HasOpen()) {
         return;
@@ -154,9 +154,9 @@ void TCimXmlClassQueue::MakeDefaultsLocal()
     }
 }
 
-void TCimXmlClassQueue::Refuse(const TCimXmlDraft& draft) const
+void TClassQueue::Refuse(const TDraft& draft) const
 {
-    const TCimXmlContext::TAt at(fContext, draft.place);
+    const TLoadContext::TAt at(fContext, draft.place);
     const std::string& superName = draft.object.GetSuperClassName();
     const std::string found = "found class " + Quote(draft.object.GetClassName()) + " with the superclass " + Quote(superName);
     if (fNumbers.count(superName) > 0) {
@@ -165,7 +165,7 @@ void TCimXmlClassQueue::Refuse(const TCimXmlDraft& draft) const
     fContext.Fail(EStatus::kNotFound, found + kIsNotDeclared);
 }
 
-std::vector<boost::shared_ptr<ICIMElement>> TCimXmlClassQueue::GetClasses() const
+std::vector<boost::shared_ptr<ICIMElement>> TClassQueue::GetClasses() const
 {
     std::vector<boost::shared_ptr<ICIMElement>> classes;
     for (const TEntry& entry : fEntries) {

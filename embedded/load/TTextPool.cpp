@@ -8,7 +8,7 @@
 // repeating and kept, in place of the one before. So texts that are all different cost a hash and their characters in a run, and
 // texts that repeat are not pushed out by a single other one. Longer text hardly ever repeats and has a block of its own. Two texts
 // with the same hash do no harm: the text itself is compared.
-#include "embedded/cimxml/TTextPool.h"
+#include "embedded/load/TTextPool.h"
 
 #include <cstdint>
 #include <cstring>

@@ -5,11 +5,12 @@
 #include <utility>
 #include <vector>
 
-#include "embedded/cimxml/TCimXmlClassQueue.h"
-#include "embedded/cimxml/TCimXmlContext.h"
-#include "embedded/cimxml/TCimXmlDraft.h"
-#include "embedded/cimxml/TCimXmlInstanceBuilder.h"
-#include "embedded/cimxml/TCimXmlLateInstances.h"
+#include "embedded/load/TClassQueue.h"
+#include "embedded/load/TDraft.h"
+#include "embedded/load/TInstanceBuilder.h"
+#include "embedded/load/TLateInstances.h"
+#include "embedded/load/TLoadContext.h"
+#include "embedded/load/TQualifierDraft.h"
 #include "embedded/store/TInMemNamespace.h"
 #include "embedded/store/TInMemStaging.h"
 #include "host/Export.h"
@@ -22,34 +23,34 @@ namespace NORVZEL20 {
 /// Until Commit is called, the destructor takes everything out again. Classes may come in any order, and instances before the
 /// classes that they need. Instances of a class are added in the document's order.
 /// Errors: every operation but Commit fails through the context. Threads: as the namespace.
-class CIMDELTA_INTERNAL_EXPORT TCimXmlLoader {
+class CIMDELTA_INTERNAL_EXPORT TLoader {
   public:
-    using TOwnKeys = TCimXmlInstanceBuilder::TOwnKeys;
-    using TReadObjects = TCimXmlInstanceBuilder::TReadObjects;
+    using TOwnKeys = TInstanceBuilder::TOwnKeys;
+    using TReadObjects = TInstanceBuilder::TReadObjects;
 
     /// `context` must outlive the loader; `ns` must not be null.
-    TCimXmlLoader(TCimXmlContext& context, const boost::shared_ptr<TInMemNamespace>& ns);
-    ~TCimXmlLoader();
+    TLoader(TLoadContext& context, const boost::shared_ptr<TInMemNamespace>& ns);
+    ~TLoader();
 
     /// A repeated declaration is tolerated if it has the same type and value. Errors: kAlreadyExists (12) if it has not.
-    void AddQualifierDecl(const TCimXmlQualifierDraft& draft);
-    /// See TCimXmlClassQueue::Add.
-    void AddClass(TCimXmlDraft draft);
+    void AddQualifierDecl(const TQualifierDraft& draft);
+    /// See TClassQueue::Add.
+    void AddClass(TDraft draft);
 
     /// Starts an instance. If it returns false, read the instance as a draft and call AddInstance; otherwise call FindProperty or
-    /// TakeLikely, and SetProperty or FillProperty, for each of its properties (see TCimXmlInstanceBuilder), then EndInstance.
+    /// TakeLikely, and SetProperty or FillProperty, for each of its properties (see TInstanceBuilder), then EndInstance.
     bool BeginInstance(const char* className);
-    TCimXmlTarget& FindProperty(const char* name) { return fBuilder.FindProperty(name); }
-    TCimXmlTarget* TakeLikely(std::size_t tagNumber) noexcept { return fBuilder.TakeLikely(tagNumber); }
-    bool FillProperty(const TCimXmlTarget& target, TCIMValue& value) noexcept { return fBuilder.FillProperty(target, value); }
-    void SetProperty(const TCimXmlTarget& target, TCIMValue&& value, bool isUnsettled)
+    TLoadTarget& FindProperty(const char* name) { return fBuilder.FindProperty(name); }
+    TLoadTarget* TakeLikely(std::uint64_t tagNumber) noexcept { return fBuilder.TakeLikely(tagNumber); }
+    bool FillProperty(const TLoadTarget& target, TCIMValue& value) noexcept { return fBuilder.FillProperty(target, value); }
+    void SetProperty(const TLoadTarget& target, TCIMValue&& value, bool isUnsettled)
     {
         fBuilder.SetProperty(target, std::move(value), isUnsettled);
     }
     /// `ownKeys` (may be null) gives the keys that the instance itself leaves out. Errors: kAlreadyExists (12) if an instance with
     /// these keys is there, kKeyMissing (14) if a key has no value.
     void EndInstance(const TOwnKeys* ownKeys);
-    void AddInstance(TCimXmlDraft draft) { fLate.Wait(std::move(draft)); }
+    void AddInstance(TDraft draft) { fLate.Wait(std::move(draft)); }
 
     /// Adds what waits. Call it at the end of the document. Errors: kNotFound (15) for a class that never came, and those of the
     /// others.
@@ -62,19 +63,19 @@ class CIMDELTA_INTERNAL_EXPORT TCimXmlLoader {
     /// Classes, then instances, each in the document's order; empty without KeepElements. Call it after Finish.
     std::vector<boost::shared_ptr<ICIMElement>> TakeElements();
 
-    /// See TCimXmlClassQueue::CountTried.
+    /// See TClassQueue::CountTried.
     std::size_t CountTried() const noexcept { return fClasses.CountTried(); }
 
   private:
     void Add(const boost::shared_ptr<TInMemInstance>& instance);
     [[noreturn]] void Explain(const TZELException& error, const TInMemInstance& instance) const;
 
-    TCimXmlContext& fContext;
+    TLoadContext& fContext;
     boost::shared_ptr<TInMemNamespace> fNamespace;
     TInMemStaging fStaging;
-    TCimXmlClassQueue fClasses;
-    TCimXmlLateInstances fLate;
-    TCimXmlInstanceBuilder fBuilder;
+    TClassQueue fClasses;
+    TLateInstances fLate;
+    TInstanceBuilder fBuilder;
     bool fHasEnded = false;  // the document: instances are held until it is decided which references are local
     TOwnPlace fOwnPlace;     // of the document, when it has ended
     bool fKeep = false;

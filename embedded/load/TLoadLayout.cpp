@@ -1,15 +1,14 @@
-#include "embedded/cimxml/TCimXmlLayout.h"
+#include "embedded/load/TLoadLayout.h"
 
 #include <utility>
 
 namespace NORVZEL20 {
 
-TCimXmlLayout::TCimXmlLayout(boost::shared_ptr<TInMemClass> ofClass)
-    : cls(std::move(ofClass)), targets(cls->GetLayout().GetSlotCount())
+TLoadLayout::TLoadLayout(boost::shared_ptr<TInMemClass> ofClass) : cls(std::move(ofClass)), targets(cls->GetLayout().GetSlotCount())
 {
     for (std::uint32_t slot = 0; slot < targets.size(); ++slot) {
         const TInMemPropertyDecl& decl = cls->GetLayout().GetDecl(slot);
-        TCimXmlTarget& target = targets[slot];
+        TLoadTarget& target = targets[slot];
         target.name = &decl.GetName();
         target.slot = slot;
         target.type = decl.GetType();
@@ -17,7 +16,7 @@ TCimXmlLayout::TCimXmlLayout(boost::shared_ptr<TInMemClass> ofClass)
         target.isStatic = decl.IsStatic();
         target.isKeptAsIs = !decl.IsStatic() && !decl.IsBag();
     }
-    TCimXmlTarget** link = &first;
+    TLoadTarget** link = &first;
     for (const std::uint32_t slot : cls->GetLayout().GetOrder()) {
         *link = &targets[slot];
         link = &targets[slot].next;

@@ -2,30 +2,40 @@
 //
 // A document may name its namespace several times: in each group, and in the name in front of each object. The first name counts,
 // and any other is an error, because objects of two namespaces would fall together in one. The same holds for the host. What
-// a document does not name is the business of TCimXmlOwnPlace.
-#include "embedded/cimxml/TCimXmlContext.h"
+// a document does not name is the business of TOwnPlaceSearch.
+#include "embedded/load/TLoadContext.h"
 
 #include <algorithm>
 #include <utility>
 
-#include "embedded/cimxml/MessageText.h"
+#include "embedded/load/MessageText.h"
 #include "embedded/value/TNameText.h"
 
 namespace NORVZEL20 {
 
-TCimXmlContext::TCimXmlContext(std::string file, std::size_t embeddedDepth) : fFile(std::move(file)), fEmbeddedDepth(embeddedDepth)
-{}
+TLoadContext::~TLoadContext() = default;
 
-TCimXmlContext::~TCimXmlContext() = default;
-
-void TCimXmlContext::Fail(TZELStatusCode::EStatusCode status, const std::string& message) const
+void TLoadContext::BeginDocument(std::string name, const IPlaceSource& reader)
 {
-    const TXmlPlace place = GetPlace();
-    throw TPopulateError(status, fEmbeddedDepth > 0 ? "in an embedded object: " + message : message, fFile, place.line,
-                         place.column);
+    fDocuments.push_back(std::move(name));
+    fReader = &reader;
 }
 
-void TCimXmlContext::EnterEmbeddedObject()
+void TLoadContext::EndDocument()
+{
+    fEnd = GetPlace();
+    fReader = nullptr;
+}
+
+void TLoadContext::Fail(TZELStatusCode::EStatusCode status, const std::string& message) const
+{
+    const TLoadPlace place = GetPlace();
+    throw TPopulateError(status, fEmbeddedDepth > 0 ? "in an embedded object: " + message : message,
+                         place.document < fDocuments.size() ? fDocuments[place.document] : std::string(), place.place.line,
+                         place.place.column);
+}
+
+void TLoadContext::EnterEmbeddedObject()
 {
     constexpr std::size_t kMaxDepth = 32;
     if (fEmbeddedDepth == kMaxDepth) {
@@ -34,12 +44,15 @@ void TCimXmlContext::EnterEmbeddedObject()
     ++fEmbeddedDepth;
 }
 
-TXmlPlace TCimXmlContext::GetPlace() const
+TLoadPlace TLoadContext::GetPlace() const
 {
-    return fPlace ? *fPlace : fReader->GetPlace();
+    if (fPlace) {
+        return *fPlace;
+    }
+    return fReader != nullptr ? TLoadPlace{fDocuments.size() - 1, fReader->GetPlace()} : fEnd;
 }
 
-void TCimXmlContext::Tolerate(const char* kind, const std::string& text)
+void TLoadContext::Tolerate(const char* kind, const std::string& text)
 {
     // Kinds are string literals, one for each caller, so comparing pointers is enough.
     const auto known = std::find(fKinds.begin(), fKinds.end(), kind);
@@ -48,10 +61,10 @@ void TCimXmlContext::Tolerate(const char* kind, const std::string& text)
         return;
     }
     fKinds.push_back(kind);
-    fReport.tolerated.push_back({text, GetPlace().line, 1});
+    fReport.tolerated.push_back({text, GetPlace().place.line, 1});
 }
 
-void TCimXmlContext::NoteNamespace(const std::string& name, const std::string& host)
+void TLoadContext::NoteNamespace(const std::string& name, const std::string& host)
 {
     if (!fReport.namesNamespace) {
         fReport.namesNamespace = true;
@@ -71,7 +84,7 @@ void TCimXmlContext::NoteNamespace(const std::string& name, const std::string& h
 }
 
 /// Other characters, such as a dot, a comma or a colon, could make two different paths read the same.
-void TCimXmlContext::CheckName(const char* what, std::string_view name) const
+void TLoadContext::CheckName(const char* what, std::string_view name) const
 {
     if (!std::all_of(name.begin(), name.end(), TNameText::IsNamePart)) {
         Fail(TZELStatusCode::kParseError,

@@ -7,13 +7,13 @@
 //    How a reference is written depends on both, so it is noted and written again at the end. The instance is added meanwhile.
 // 3. As 2, but the reference is a key. Then the name of the instance itself may change, so the instance is held: filled, but added
 //    only after its references have been written again. Later instances of its class are held too, for the order.
-#include "embedded/cimxml/TCimXmlLateInstances.h"
+#include "embedded/load/TLateInstances.h"
 
 #include "embedded/store/TReferenceAdapter.h"
 
 namespace NORVZEL20 {
 
-void TCimXmlLateInstances::AdaptReferences(TCimXmlOwnPlace& place, const TInMemNamespace& ns, std::size_t declared)
+void TLateInstances::AdaptReferences(TOwnPlaceSearch& place, const TInMemNamespace& ns, std::size_t declared)
 {
     if (declared == fDeclaredBefore) {
         return;  // what was not known then is not known now
@@ -28,7 +28,7 @@ void TCimXmlLateInstances::AdaptReferences(TCimXmlOwnPlace& place, const TInMemN
     }
 }
 
-void TCimXmlLateInstances::MakeReferencesLocal(TCimXmlOwnPlace& place)
+void TLateInstances::MakeReferencesLocal(TOwnPlaceSearch& place)
 {
     if (!place.HasOpen()) {
         return;

@@ -7,12 +7,13 @@
 #include <utility>
 #include <vector>
 
-#include "embedded/cimxml/TCimXmlOwnPlace.h"
-#include "embedded/cimxml/TLoadReport.h"
-#include "embedded/cimxml/TPopulateError.h"
-#include "embedded/cimxml/TTextPool.h"
-#include "embedded/cimxml/TXmlPlace.h"
-#include "embedded/cimxml/TXmlReader.h"
+#include "embedded/load/IPlaceSource.h"
+#include "embedded/load/TLoadPlace.h"
+#include "embedded/load/TLoadReport.h"
+#include "embedded/load/TOwnPlaceSearch.h"
+#include "embedded/load/TPopulateError.h"
+#include "embedded/load/TTextPlace.h"
+#include "embedded/load/TTextPool.h"
 #include "host/Export.h"
 
 namespace NORVZEL20 {
@@ -21,13 +22,13 @@ namespace NORVZEL20 {
 ///
 /// "Fails" means everywhere in this folder: throws TPopulateError with the status named and with the place that GetPlace returns.
 /// Threads: one at a time, as the load that it belongs to.
-class CIMDELTA_INTERNAL_EXPORT TCimXmlContext {
+class CIMDELTA_INTERNAL_EXPORT TLoadContext {
   public:
     /// While it lives, errors and notes are reported at `place` instead of the position being read. It is for parts that were read
     /// earlier and are used only now. Objects may nest; the innermost counts.
     class TAt {
       public:
-        TAt(TCimXmlContext& context, const TXmlPlace& place) : fContext(context), fEarlier(context.fPlace)
+        TAt(TLoadContext& context, const TLoadPlace& place) : fContext(context), fEarlier(context.fPlace)
         {
             context.fPlace = place;
         }
@@ -36,27 +37,29 @@ class CIMDELTA_INTERNAL_EXPORT TCimXmlContext {
         ~TAt() { fContext.fPlace = fEarlier; }
 
       private:
-        TCimXmlContext& fContext;
-        std::optional<TXmlPlace> fEarlier;
+        TLoadContext& fContext;
+        std::optional<TLoadPlace> fEarlier;
     };
 
-    /// `file` is what messages call the document, `embeddedDepth` how many embedded objects it stands in.
-    explicit TCimXmlContext(std::string file, std::size_t embeddedDepth = 0);
-    ~TCimXmlContext();
+    /// `embeddedDepth` is how many embedded objects what is read stands in.
+    explicit TLoadContext(std::size_t embeddedDepth = 0) noexcept : fEmbeddedDepth(embeddedDepth) {}
+    TLoadContext(const TLoadContext&) = delete;
+    TLoadContext& operator=(const TLoadContext&) = delete;
+    ~TLoadContext();
 
-    /// Sets the XML reader that knows the place. Call it before the load begins. The reader must outlive the load.
-    void SetReader(const TXmlReader& reader) noexcept { fReader = &reader; }
-    /// Who reads the documents within the document: whoever reads that.
-    TXmlReader::EParser GetParser() const noexcept
-    {
-        return fReader != nullptr ? fReader->GetParser() : TXmlReader::EParser::kTokenizer;
-    }
+    /// Begins a document. `name` is what messages call it, and `reader` knows the place in it, until EndDocument.
+    void BeginDocument(std::string name, const IPlaceSource& reader);
+    /// Ends the document. What fails after it, outside of any TAt, is reported at its end.
+    void EndDocument();
 
     /// Ends the load. `message` says what was found and what was expected or can be done.
     [[noreturn]] void Fail(TZELStatusCode::EStatusCode status, const std::string& message) const;
 
     /// The place of the innermost TAt, or else the position being read.
-    TXmlPlace GetPlace() const;
+    TLoadPlace GetPlace() const;
+    std::size_t CountDocuments() const noexcept { return fDocuments.size(); }
+    /// What messages call the document of that number.
+    const std::string& GetDocument(std::size_t number) const { return fDocuments[number]; }
 
     /// Notes in the report something odd that does not end the load. `kind` must be a string literal: the first call with it adds
     /// `text` and its place to the report, later ones are counted.
@@ -68,7 +71,7 @@ class CIMDELTA_INTERNAL_EXPORT TCimXmlContext {
 
     TLoadReport& GetReport() noexcept { return fReport; }
     /// Decides which references stay within the document's own namespace.
-    TCimXmlOwnPlace& GetOwnPlace() noexcept { return fOwnPlace; }
+    TOwnPlaceSearch& GetOwnPlace() noexcept { return fOwnPlace; }
     TTextPool& GetTexts() noexcept { return fTexts; }
 
     /// Call these two around the reading of an embedded object; messages then mention that they are about one. Errors: fails with
@@ -97,11 +100,12 @@ class CIMDELTA_INTERNAL_EXPORT TCimXmlContext {
     }
 
   private:
-    std::string fFile;
-    const TXmlReader* fReader = nullptr;
-    std::optional<TXmlPlace> fPlace;  // of the innermost TAt
+    std::vector<std::string> fDocuments;    // their names
+    const IPlaceSource* fReader = nullptr;  // of the document that is open
+    TLoadPlace fEnd;                        // of the document that was ended last
+    std::optional<TLoadPlace> fPlace;       // of the innermost TAt
     TLoadReport fReport;
-    TCimXmlOwnPlace fOwnPlace{fReport};
+    TOwnPlaceSearch fOwnPlace{fReport};
     std::vector<const char*> fKinds;  // of the entries of fReport.tolerated
     TTextPool fTexts;
     std::size_t fEmbeddedDepth;  // embedded objects that are being read, one inside of the other

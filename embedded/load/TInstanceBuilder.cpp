@@ -4,9 +4,9 @@
 // which the class declares them, and instances of one class in a row. So the builder expects the class of the instance before and
 // the property after the one before; both are compared before anything is looked up by name. Which properties an instance has had
 // is kept in the class's layout, as the number of the last instance that had it, so nothing is cleared between instances.
-#include "embedded/cimxml/TCimXmlInstanceBuilder.h"
+#include "embedded/load/TInstanceBuilder.h"
 
-#include "embedded/cimxml/MessageText.h"
+#include "embedded/load/MessageText.h"
 #include "embedded/store/TReferenceAdapter.h"
 #include "embedded/value/TValueAccess.h"
 #include "embedded/value/TValueText.h"
@@ -24,9 +24,9 @@ std::string Show(const TCIMValue& value)
 
 }  // namespace
 
-bool TCimXmlInstanceBuilder::Begin(const char* className)
+bool TInstanceBuilder::Begin(const char* className)
 {
-    TCimXmlLayout* layout = FindLayout(className);
+    TLoadLayout* layout = FindLayout(className);
     if (layout == nullptr) {
         return false;
     }
@@ -38,7 +38,7 @@ bool TCimXmlInstanceBuilder::Begin(const char* className)
 }
 
 /// Static properties have one value for all instances, so it is saved before the first instance changes it.
-TCimXmlLayout* TCimXmlInstanceBuilder::FindLayout(const char* className)
+TLoadLayout* TInstanceBuilder::FindLayout(const char* className)
 {
     if (fLayout != nullptr && fLayout->cls->GetName() == className) {
         return fLayout;
@@ -52,12 +52,12 @@ TCimXmlLayout* TCimXmlInstanceBuilder::FindLayout(const char* className)
         return nullptr;
     }
     fStaging.KeepStaticValues(*cls);
-    return fLayouts.emplace(className, std::make_unique<TCimXmlLayout>(cls)).first->second.get();
+    return fLayouts.emplace(className, std::make_unique<TLoadLayout>(cls)).first->second.get();
 }
 
-TCimXmlTarget& TCimXmlInstanceBuilder::FindProperty(const char* name)
+TLoadTarget& TInstanceBuilder::FindProperty(const char* name)
 {
-    TCimXmlTarget* target = fExpected;
+    TLoadTarget* target = fExpected;
     if (target == nullptr || *target->name != name) {
         const std::uint32_t slot = fLayout->cls->GetLayout().FindSlot(name);
         if (slot == TInMemLayout::kNoSlot) {
@@ -72,7 +72,7 @@ TCimXmlTarget& TCimXmlInstanceBuilder::FindProperty(const char* name)
     return *target;
 }
 
-void TCimXmlInstanceBuilder::SetProperty(const TCimXmlTarget& target, TCIMValue&& value, bool isUnsettled)
+void TInstanceBuilder::SetProperty(const TLoadTarget& target, TCIMValue&& value, bool isUnsettled)
 {
     if (value.GetType() != target.type) {
         value = Convert(target, value);
@@ -93,7 +93,7 @@ void TCimXmlInstanceBuilder::SetProperty(const TCimXmlTarget& target, TCIMValue&
 }
 
 /// The last value would be that of all instances. So if two instances give different ones, what the document says of one is lost.
-void TCimXmlInstanceBuilder::SetStatic(const TCimXmlTarget& target, const TCIMValue& value)
+void TInstanceBuilder::SetStatic(const TLoadTarget& target, const TCIMValue& value)
 {
     TInMemPropertyDecl& decl = *fLayout->cls->GetLayout().GetSharedDecl(target.slot);
     TInMemStaticProperty& property = decl.GetStaticProperty();
@@ -107,7 +107,7 @@ void TCimXmlInstanceBuilder::SetStatic(const TCimXmlTarget& target, const TCIMVa
 }
 
 /// Writers do not always use the declared type: another one is accepted if the declared type can hold the value exactly.
-TCIMValue TCimXmlInstanceBuilder::Convert(const TCimXmlTarget& target, const TCIMValue& value)
+TCIMValue TInstanceBuilder::Convert(const TLoadTarget& target, const TCIMValue& value)
 {
     const std::string& className = fLayout->cls->GetName();
     TCIMValue converted;
@@ -125,30 +125,30 @@ TCIMValue TCimXmlInstanceBuilder::Convert(const TCimXmlTarget& target, const TCI
 }
 
 /// References get the form that their classes declare, as far as they are declared, and lose the document's own namespace. Returns
-/// whether one of them is open (see TCimXmlOwnPlace).
-bool TCimXmlInstanceBuilder::Localize(TCIMValue& value) const
+/// whether one of them is open (see TOwnPlaceSearch).
+bool TInstanceBuilder::Localize(TCIMValue& value) const
 {
     TReferenceAdapter(fNamespace).Adapt(value);
     return fContext.GetOwnPlace().MakeLocal(value);
 }
 
-void TCimXmlInstanceBuilder::Fill(const TCimXmlDraft& draft, const TReadObjects& readObjects)
+void TInstanceBuilder::Fill(const TDraft& draft, const TReadObjects& readObjects)
 {
     const TEmbeddedObject& object = draft.object;
     if (!Begin(object.GetClassName().c_str())) {
         fContext.Fail(EStatus::kNotFound, "found an instance of class " + Quote(object.GetClassName()) + kIsNotDeclared);
     }
     for (std::size_t index = 0; index < object.GetProperties().size(); ++index) {
-        const TCimXmlContext::TAt at(fContext, draft.propertyPlaces[index]);
+        const TLoadContext::TAt at(fContext, draft.propertyPlaces[index]);
         const TEmbeddedObject::TProperty& property = object.GetProperties()[index];
-        const TCimXmlTarget& target = FindProperty(property.name.c_str());
+        const TLoadTarget& target = FindProperty(property.name.c_str());
         TCIMValue value = target.isEmbedded ? readObjects(property.value) : property.value;
         const bool isOpen = Localize(value);
         SetProperty(target, std::move(value), isOpen);
     }
 }
 
-boost::shared_ptr<TInMemInstance> TCimXmlInstanceBuilder::Take(const TOwnKeys* ownKeys)
+boost::shared_ptr<TInMemInstance> TInstanceBuilder::Take(const TOwnKeys* ownKeys)
 {
     if (ownKeys != nullptr && fInstance->FindMissingKey() != nullptr) {
         FillKeys(*ownKeys);
@@ -157,7 +157,7 @@ boost::shared_ptr<TInMemInstance> TCimXmlInstanceBuilder::Take(const TOwnKeys* o
 }
 
 /// Takes keys that the instance leaves out from the name in front of it.
-void TCimXmlInstanceBuilder::FillKeys(const TOwnKeys& keys)
+void TInstanceBuilder::FillKeys(const TOwnKeys& keys)
 {
     for (const auto& [name, value] : keys) {
         const std::uint32_t slot = fLayout->cls->GetLayout().FindSlot(name);

@@ -12,13 +12,13 @@
 // A document is read once, so both are known only at its end. Until then such references are open: they are stored as they are
 // written, and written again after Decide. A reference without a namespace is never open, and neither is one without a host in a
 // document that names its namespace first.
-#include "embedded/cimxml/TCimXmlOwnPlace.h"
+#include "embedded/load/TOwnPlaceSearch.h"
 
 #include "embedded/value/ChangeReferences.h"
 
 namespace NORVZEL20 {
 
-TCimXmlOwnPlace::EAnswer TCimXmlOwnPlace::Classify(const std::string& name, const std::string& host)
+TOwnPlaceSearch::EAnswer TOwnPlaceSearch::Classify(const std::string& name, const std::string& host)
 {
     if (name.empty()) {
         fIsNameless = true;
@@ -39,7 +39,7 @@ TCimXmlOwnPlace::EAnswer TCimXmlOwnPlace::Classify(const std::string& name, cons
     return kOpen;
 }
 
-bool TCimXmlOwnPlace::MakeLocal(TCIMValue& value)
+bool TOwnPlaceSearch::MakeLocal(TCIMValue& value)
 {
     bool isOpen = false;
     ChangeReferences(value, [&](TCIMValue& path) { return MakePathLocal(path, isOpen); });
@@ -47,7 +47,7 @@ bool TCimXmlOwnPlace::MakeLocal(TCIMValue& value)
 }
 
 /// Returns whether the path changed.
-bool TCimXmlOwnPlace::MakePathLocal(TCIMValue& value, bool& isOpen)
+bool TOwnPlaceSearch::MakePathLocal(TCIMValue& value, bool& isOpen)
 {
     const TCIMReference path = value;
     TCIMReference local(path);
@@ -72,7 +72,7 @@ bool TCimXmlOwnPlace::MakePathLocal(TCIMValue& value, bool& isOpen)
     return isChanged;
 }
 
-void TCimXmlOwnPlace::Decide()
+void TOwnPlaceSearch::Decide()
 {
     fReport.referencesNameNamespace = HasOpen();
     if (!fReport.namesNamespace && fNamed.size() == 1 && !fIsNameless) {
@@ -83,7 +83,7 @@ void TCimXmlOwnPlace::Decide()
     fIsDecided = true;
 }
 
-TOwnPlace TCimXmlOwnPlace::GetNamed() const
+TOwnPlace TOwnPlaceSearch::GetNamed() const
 {
     return {fReport.namespaceName, fReport.host, fIsAnyHostOwn};
 }

@@ -1,4 +1,4 @@
-#include "embedded/cimxml/TPopulateError.h"
+#include "embedded/load/TPopulateError.h"
 
 #include <utility>
 

@@ -1,0 +1,146 @@
+// One document, from bytes to a load:
+//
+//     file, memory or source --bytes--> TXmlReader --events--> TCimXmlReader --classes, instances--> TLoader of the session
+//
+// TDocument owns the readers. They live for one document only; what documents share belongs to the session.
+#include "embedded/cimxml/TCimXmlDocuments.h"
+
+#include <algorithm>
+#include <boost/ref.hpp>
+#include <boost/smart_ptr/make_shared.hpp>
+#include <memory>
+
+#include "embedded/cimxml/ReadObjectKey.h"
+#include "embedded/cimxml/TCimXmlObjectReader.h"
+#include "embedded/cimxml/TCimXmlPathReader.h"
+#include "embedded/cimxml/TCimXmlReader.h"
+#include "embedded/cimxml/TXmlReader.h"
+#include "embedded/load/TFileSource.h"
+#include "embedded/load/TLoadContext.h"
+#include "embedded/load/TLoader.h"
+#include "embedded/store/TInMemNamespace.h"
+
+namespace NORVZEL20 {
+
+namespace {
+
+using EStatus = TZELStatusCode::EStatusCode;
+
+constexpr std::size_t kReadPiece = 256 * 1024;
+
+/// One document, from its first byte to its end.
+class TDocument {
+  public:
+    TDocument(TLoadSession& session, const std::string& name, TXmlReader::EParser parser)
+        : fContext(session.GetContext()), fReader(fContext, session.GetNamespace(), &session.GetLoader(), parser),
+          fXml(fReader, parser)
+    {
+        fContext.BeginDocument(name, fXml);
+    }
+
+    void ReadMemory(const char* data, std::size_t length)
+    {
+        RefuseEmpty(length);
+        Check(fXml.Parse(data, length, true));
+    }
+
+    void ReadSource(const TCimXmlDocuments::TPullSource& source)
+    {
+        std::size_t total = 0;
+        std::size_t length = 0;
+        std::size_t room = 0;
+        do {
+            // A tag that has not ended is read again with each piece. Pieces as long as that tag keep the total linear.
+            room = std::max(kReadPiece, fXml.GetPending());
+            length = Fill(source, fXml.GetBuffer(room), room);
+            total += length;
+            Check(fXml.ParseBuffer(length));
+        } while (length == room);
+        RefuseEmpty(total);
+        Check(fXml.Finish());
+    }
+
+  private:
+    /// Pulls until the room is full or the document ends: many small pieces would be parsed slowly.
+    static std::size_t Fill(const TCimXmlDocuments::TPullSource& source, char* buffer, std::size_t room)
+    {
+        std::size_t length = 0;
+        while (length < room) {
+            const std::size_t more = source(buffer + length, room - length);
+            if (more == 0) {
+                break;
+            }
+            length += more;
+        }
+        return length;
+    }
+
+    void RefuseEmpty(std::size_t length) const
+    {
+        if (length == 0) {
+            fContext.Fail(EStatus::kParseError, "found an empty document, expected CIM-XML");
+        }
+    }
+
+    void Check(bool succeeded) const
+    {
+        if (!succeeded) {
+            fContext.Fail(EStatus::kParseError, "found malformed XML: " + fXml.GetError());
+        }
+    }
+
+    TLoadContext& fContext;
+    TCimXmlReader fReader;
+    TXmlReader fXml;
+};
+
+/// Reads texts when all documents have ended, for classes that were declared after the instances.
+class TLateObjects {
+  public:
+    explicit TLateObjects(TLoadSession& session)
+        : fPaths(session.GetContext(), session.GetNamespace()),
+          fObjects(session.GetContext(), session.GetNamespace(), fPaths, TXmlReader::EParser::kTokenizer)
+    {}
+
+    TCIMValue ReadAll(const TCIMValue& value) { return fObjects.ReadAll(value); }
+
+  private:
+    TCimXmlPathReader fPaths;
+    TCimXmlObjectReader fObjects;
+};
+
+}  // namespace
+
+TCimXmlDocuments::TCimXmlDocuments(TLoadSession& session) : fSession(session)
+{
+    session.GetNamespace()->SetObjectReader(&ReadObjectKey);
+    const auto late = boost::make_shared<TLateObjects>(session);
+    session.SetObjectReader([late](const TCIMValue& value) { return late->ReadAll(value); });
+}
+
+template <class TRead>
+void TCimXmlDocuments::Read(const std::string& name, TRead read)
+{
+    TDocument document(fSession, name, fUsesExpatAlone ? TXmlReader::EParser::kExpat : TXmlReader::EParser::kTokenizer);
+    read(document);
+    fSession.GetContext().EndDocument();
+}
+
+void TCimXmlDocuments::ReadMemory(const char* data, std::size_t length, const std::string& name)
+{
+    Read(name, [&](TDocument& document) { document.ReadMemory(data, length); });
+}
+
+void TCimXmlDocuments::ReadSource(const TPullSource& source, const std::string& name)
+{
+    Read(name, [&](TDocument& document) { document.ReadSource(source); });
+}
+
+/// The source is passed by reference, because it owns the open file.
+void TCimXmlDocuments::ReadFile(const std::string& path)
+{
+    TFileSource file(path);
+    ReadSource(boost::ref(file), path);
+}
+
+}  // namespace NORVZEL20

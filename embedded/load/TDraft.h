@@ -1,0 +1,19 @@
+#pragma once
+
+#include <string>
+#include <vector>
+
+#include "embedded/load/TLoadPlace.h"
+#include "embedded/value/TEmbeddedObject.h"
+
+namespace NORVZEL20 {
+
+/// A class or an instance as a document describes it, with its place there, until it can be added to a namespace.
+struct TDraft {
+    TEmbeddedObject object;
+    TLoadPlace place;
+    std::vector<TLoadPlace> propertyPlaces;                  ///< in the order of the object's properties
+    std::vector<std::pair<std::string, TCIMValue>> ownKeys;  ///< for an instance: the keys of the name in front of it
+};
+
+}  // namespace NORVZEL20

@@ -1,0 +1,23 @@
+#pragma once
+
+#include <boost/smart_ptr/shared_ptr.hpp>
+#include <vector>
+
+#include "embedded/load/TLoadTarget.h"
+#include "embedded/store/TInMemClass.h"
+
+namespace NORVZEL20 {
+
+/// What is looked up once for a class whose instances are read; it makes finding a property fast.
+struct TLoadLayout {
+    explicit TLoadLayout(boost::shared_ptr<TInMemClass> cls);
+    TLoadLayout(const TLoadLayout&) = delete;
+    TLoadLayout& operator=(const TLoadLayout&) = delete;
+
+    boost::shared_ptr<TInMemClass> cls;
+    std::vector<TLoadTarget> targets;  ///< by slot
+    TLoadTarget* first = nullptr;      ///< in the order of declaration; null if the class has no properties
+    bool isHeld = false;               ///< see TLateInstances::Hold
+};
+
+}  // namespace NORVZEL20

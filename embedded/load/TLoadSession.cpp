@@ -1,0 +1,83 @@
+#include "embedded/load/TLoadSession.h"
+
+#include <string>
+#include <utility>
+
+#include "embedded/load/TLoadContext.h"
+#include "embedded/load/TLoader.h"
+#include "embedded/store/TInMemNamespace.h"
+
+namespace NORVZEL20 {
+
+/// What the documents of one load share. The loader takes back what it added, unless it was committed.
+class TLoadSession::TParts {
+  public:
+    explicit TParts(const boost::shared_ptr<TInMemNamespace>& ns) : fNamespace(ns), fLoader(fContext, ns) {}
+
+    boost::shared_ptr<TInMemNamespace> fNamespace;
+    TLoadContext fContext;
+    TLoader fLoader;
+    TReadObjects fReadObjects = [](const TCIMValue& value) { return value; };
+    std::vector<boost::shared_ptr<ICIMElement>> fElements;
+};
+
+namespace {
+
+boost::shared_ptr<TInMemNamespace> RequireInMem(const boost::shared_ptr<ICIMNamespace>& ns, const std::string& name)
+{
+    auto known = boost::dynamic_pointer_cast<TInMemNamespace>(ns);
+    if (!known) {
+        throw TPopulateError(TZELStatusCode::kNotSupported,
+                             "the namespace is not one of the provider \"inmem\"; load into one of those", name, 0, 0);
+    }
+    return known;
+}
+
+}  // namespace
+
+TLoadSession::TLoadSession(const boost::shared_ptr<ICIMNamespace>& ns, const std::string& name)
+    : fParts(std::make_unique<TParts>(RequireInMem(ns, name)))
+{}
+
+TLoadSession::~TLoadSession() = default;
+
+void TLoadSession::KeepElements()
+{
+    fParts->fLoader.KeepElements();
+}
+
+TLoadReport TLoadSession::Commit()
+{
+    TLoader& loader = fParts->fLoader;
+    fParts->fContext.Guard([&] { loader.Finish(fParts->fReadObjects); });
+    fParts->fElements = loader.TakeElements();
+    loader.Commit();
+    return std::move(fParts->fContext.GetReport());
+}
+
+std::vector<boost::shared_ptr<ICIMElement>> TLoadSession::TakeElements()
+{
+    return std::exchange(fParts->fElements, {});
+}
+
+TLoadContext& TLoadSession::GetContext() noexcept
+{
+    return fParts->fContext;
+}
+
+TLoader& TLoadSession::GetLoader() noexcept
+{
+    return fParts->fLoader;
+}
+
+const boost::shared_ptr<TInMemNamespace>& TLoadSession::GetNamespace() const noexcept
+{
+    return fParts->fNamespace;
+}
+
+void TLoadSession::SetObjectReader(const TReadObjects& readObjects)
+{
+    fParts->fReadObjects = readObjects;
+}
+
+}  // namespace NORVZEL20
