@@ -1,16 +1,18 @@
 // From the draft of a class to the class.
 //
 // Two kinds of documents exist. Some list only what a class itself declares; others repeat what it inherits, marked PROPAGATED.
-// Both must give the same class, so a part that is marked and that the superclass has is left out. The mark alone is not enough:
-// a part that is marked but that no superclass declares would otherwise be lost.
+// Both must give the same class, so a part that is marked and that says what the superclass says is left out; OwnPartOf decides. A
+// part that is marked but that no superclass declares would otherwise be lost, and so is taken as the class's own.
 //
 // Names are checked here, because here they become part of paths. Limits are checked with inherited parts included, which a draft
 // cannot know: every instance of every subclass has room for each property.
 #include "embedded/load/TClassMaker.h"
 
 #include <boost/smart_ptr/make_shared.hpp>
+#include <optional>
 
 #include "embedded/load/MessageText.h"
+#include "embedded/load/OwnPartOf.h"
 #include "embedded/store/TInMemQualifier.h"
 #include "embedded/store/TSchemaLimits.h"
 #include "embedded/value/TValueText.h"
@@ -75,10 +77,17 @@ void TClassMaker::AddProperty(TInMemClass& cls, const TEmbeddedObject::TProperty
                                                   ", but a superclass declares it as " +
                                                   TValueText::DescribeType(inherited->GetType()));
     }
-    // The document repeats what the class inherits anyway. The type was compared above.
-    if (inherited && property.propagated) {
-        return;
+    // The type was compared above.
+    if (!inherited || !property.propagated) {
+        return DeclareProperty(cls, property, inherited.get());
     }
+    if (const std::optional<TEmbeddedObject::TProperty> own = OwnPartOf(property, *inherited)) {
+        DeclareProperty(cls, *own, inherited.get());
+    }
+}
+
+void TClassMaker::DeclareProperty(TInMemClass& cls, const TEmbeddedObject::TProperty& property, const TInMemPropertyDecl* inherited)
+{
     const auto decl = boost::make_shared<TInMemPropertyDecl>(property.name, property.value);
     decl->SetReferenceClass(property.referenceClass);
     decl->SetArraySize(property.arraySize);
@@ -92,9 +101,16 @@ void TClassMaker::AddMethod(TInMemClass& cls, const TEmbeddedObject::TMethod& me
 {
     const boost::shared_ptr<TInMemMethodDecl> inherited =
         super != nullptr ? super->GetMethods().Find(method.name) : boost::shared_ptr<TInMemMethodDecl>();
-    if (inherited && method.propagated) {
-        return;
+    if (!inherited || !method.propagated) {
+        return DeclareMethod(cls, method, inherited.get());
     }
+    if (const std::optional<TEmbeddedObject::TMethod> own = OwnPartOf(method, *inherited)) {
+        DeclareMethod(cls, *own, inherited.get());
+    }
+}
+
+void TClassMaker::DeclareMethod(TInMemClass& cls, const TEmbeddedObject::TMethod& method, const TInMemMethodDecl* inherited)
+{
     const auto decl = boost::make_shared<TInMemMethodDecl>(method.name, method.type);
     for (const TEmbeddedObject::TParameter& parameter : method.parameters) {
         const auto made = boost::make_shared<TInMemParameter>(parameter.name, parameter.type);
@@ -117,15 +133,10 @@ void TClassMaker::AddQualifiers(TElement& element, const TQualifiers& qualifiers
                                                 " qualifiers on one element, inherited ones included; remove some");
     }
     for (const TEmbeddedObject::TQualifier& qualifier : qualifiers) {
-        boost::shared_ptr<ICIMQualifier> above;
-        if (inherited != nullptr) {
-            above = inherited->Find(qualifier.name);
-        }
-        // The element inherits this qualifier.
-        if (above && qualifier.propagated) {
+        if (IsInherited(qualifier, inherited)) {
             continue;
         }
-        NoteQualifier(qualifier, above.get());
+        NoteQualifier(qualifier, inherited != nullptr ? inherited->Find(qualifier.name).get() : nullptr);
         element.AddQualifier(boost::make_shared<TInMemQualifier>(qualifier.name, qualifier.value, qualifier.flavor));
     }
 }

@@ -11,7 +11,8 @@ namespace NORVZEL20 {
 
 /// Makes classes from their drafts.
 ///
-/// A part that a document repeats from the superclass (PROPAGATED) is left out if the superclass has it, and so is inherited.
+/// A part that a document repeats from the superclass (PROPAGATED) is left out if it says what the superclass says, and so is
+/// inherited. If it says anything else, it is an override.
 /// Qualifiers without a declaration, and restated ones with another flavor, are tolerated.
 /// Errors: fails through the context with kParseError (9) if a name cannot stand in a path, a part is declared twice or the class
 /// would exceed TSchemaLimits, with kTypeMismatch (13) if a property has another type than in a superclass.
@@ -32,7 +33,9 @@ class TClassMaker {
     [[noreturn]] void FailSecond(const char* what, const std::string& name, const TInMemClass& cls) const;
     void NoteQualifier(const TEmbeddedObject::TQualifier& qualifier, const ICIMQualifier* inherited);
     void AddProperty(TInMemClass& cls, const TEmbeddedObject::TProperty& property, const TInMemClass* super);
+    void DeclareProperty(TInMemClass& cls, const TEmbeddedObject::TProperty& property, const TInMemPropertyDecl* inherited);
     void AddMethod(TInMemClass& cls, const TEmbeddedObject::TMethod& method, const TInMemClass* super);
+    void DeclareMethod(TInMemClass& cls, const TEmbeddedObject::TMethod& method, const TInMemMethodDecl* inherited);
 
     TLoadContext& fContext;
     TInMemNamespace& fNamespace;

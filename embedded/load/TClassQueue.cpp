@@ -31,7 +31,8 @@ void TClassQueue::Add(TDraft draft)
         return NoteRepeated(name, fEntries[repeated->second].draft.object == draft.object, kInDocument);
     }
     if (const boost::shared_ptr<TInMemClass> known = fNamespace.FindClass(name)) {
-        const bool isSame = TStoredObjects::FromClass(*known) == TStoredObjects::WithoutInherited(draft.object);
+        const bool isSame =
+            TStoredObjects::FromClass(*known) == TStoredObjects::WithoutInherited(draft.object, known->GetSuperInMemClass().get());
         return NoteRepeated(name, isSame, kInNamespace);
     }
     fNumbers.emplace(name, fEntries.size());

@@ -6,9 +6,10 @@
 // interfaces show.
 #include "embedded/load/TStoredObjects.h"
 
-#include <type_traits>
+#include <optional>
 #include <utility>
 
+#include "embedded/load/OwnPartOf.h"
 #include "embedded/store/TInMemClass.h"
 
 namespace NORVZEL20 {
@@ -55,7 +56,9 @@ TEmbeddedObject::TProperty FromPropertyDecl(const ICIMPropertyDecl& decl)
     return property;
 }
 
-TEmbeddedObject::TMethod FromMethodDecl(const ICIMMethodDecl& decl)
+}  // namespace
+
+TEmbeddedObject::TMethod TStoredObjects::FromMethod(const ICIMMethodDecl& decl)
 {
     TEmbeddedObject::TMethod method;
     method.name = decl.GetName(TCallContext());
@@ -73,6 +76,8 @@ TEmbeddedObject::TMethod FromMethodDecl(const ICIMMethodDecl& decl)
     return method;
 }
 
+namespace {
+
 /// Adds what a class of this host declares itself.
 void AddOwnElements(TEmbeddedObject& object, const TInMemClass& cls)
 {
@@ -80,7 +85,7 @@ void AddOwnElements(TEmbeddedObject& object, const TInMemClass& cls)
         object.AddProperty(FromPropertyDecl(*decl));
     }
     for (const boost::shared_ptr<TInMemMethodDecl>& decl : cls.GetMethods().GetOwn()) {
-        object.AddMethod(FromMethodDecl(*decl));
+        object.AddMethod(TStoredObjects::FromMethod(*decl));
     }
 }
 
@@ -92,46 +97,60 @@ void AddAllElements(TEmbeddedObject& object, const ICIMClass& cls)
         return true;
     };
     const auto addMethod = [&](const boost::shared_ptr<ICIMMethodDecl>& decl) {
-        object.AddMethod(FromMethodDecl(*decl));
+        object.AddMethod(TStoredObjects::FromMethod(*decl));
         return true;
     };
     cls.EnumeratePropertyDecls(addProperty, TCallContext());
     cls.EnumerateMethodDecls(addMethod, TCallContext());
 }
 
-/// The elements without the propagated ones, and without propagated qualifiers on the others.
+/// Takes out the qualifiers that repeat those of `above` (null for none).
 template <class TElement>
-std::vector<TElement> OwnOf(const std::vector<TElement>& elements)
+void DropInheritedQualifiers(TElement& element, const TInMemQualifierSet* above)
 {
-    std::vector<TElement> own;
-    for (const TElement& element : elements) {
-        if (!element.propagated) {
-            own.push_back(element);
+    TQualifiers own;
+    for (TEmbeddedObject::TQualifier& qualifier : element.qualifiers) {
+        if (!IsInherited(qualifier, above)) {
+            own.push_back(std::move(qualifier));
         }
     }
-    // Properties and methods have qualifiers of their own, which may be propagated; qualifiers have none.
-    if constexpr (!std::is_same_v<TElement, TEmbeddedObject::TQualifier>) {
-        for (TElement& element : own) {
-            element.qualifiers = OwnOf(element.qualifiers);
-        }
+    element.qualifiers = std::move(own);
+}
+
+/// What the class itself declares of a property or a method, `above` being the inherited one (null for none).
+template <class TElement, class TDecl>
+std::optional<TElement> MakeOwn(const TElement& element, const boost::shared_ptr<TDecl>& above)
+{
+    if (above && element.propagated) {
+        return OwnPartOf(element, *above);
     }
+    TElement own = element;
+    DropInheritedQualifiers(own, above ? &above->GetQualifiers() : nullptr);
     return own;
 }
 
 }  // namespace
 
-TEmbeddedObject TStoredObjects::WithoutInherited(const TEmbeddedObject& cls)
+TEmbeddedObject TStoredObjects::WithoutInherited(const TEmbeddedObject& cls, const TInMemClass* super)
 {
     TEmbeddedObject object(cls.GetClassName(), true);
     object.SetSuperClassName(cls.GetSuperClassName());
-    for (TEmbeddedObject::TQualifier& qualifier : OwnOf(cls.GetQualifiers())) {
-        object.AddQualifier(std::move(qualifier));
+    for (const TEmbeddedObject::TQualifier& qualifier : cls.GetQualifiers()) {
+        if (!IsInherited(qualifier, super != nullptr ? &super->GetQualifiers() : nullptr)) {
+            object.AddQualifier(qualifier);
+        }
     }
-    for (TEmbeddedObject::TProperty& property : OwnOf(cls.GetProperties())) {
-        object.AddProperty(std::move(property));
+    for (const TEmbeddedObject::TProperty& property : cls.GetProperties()) {
+        const auto above = super != nullptr ? super->FindPropertyDecl(property.name) : nullptr;
+        if (std::optional<TEmbeddedObject::TProperty> own = MakeOwn(property, above)) {
+            object.AddProperty(std::move(*own));
+        }
     }
-    for (TEmbeddedObject::TMethod& method : OwnOf(cls.GetMethods())) {
-        object.AddMethod(std::move(method));
+    for (const TEmbeddedObject::TMethod& method : cls.GetMethods()) {
+        const auto above = super != nullptr ? super->GetMethods().Find(method.name) : nullptr;
+        if (std::optional<TEmbeddedObject::TMethod> own = MakeOwn(method, above)) {
+            object.AddMethod(std::move(*own));
+        }
     }
     return object;
 }
