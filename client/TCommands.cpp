@@ -3,6 +3,8 @@
 #include <algorithm>
 #include <memory>
 
+#include "client/AddLoadingOptions.h"
+#include "client/AddText.h"
 #include "client/BracketGuard.h"
 #include "client/commands/PrepareFiles.h"
 #include "client/report/OutputFormats.h"
@@ -14,20 +16,9 @@ namespace {
 
 const char kInventoryHelp[] = "CIM-XML, plain or compressed with gzip, xz or zstd; - is standard input";
 
-std::string RefuseEmpty(const std::string& text)
-{
-    return text.empty() ? "must not be empty" : "";
-}
-
 void AddVersion(CLI::App& app)
 {
     app.set_version_flag("--version", std::string("cimdelta ") + CIMDELTA_VERSION);
-}
-
-template <class TTarget>
-CLI::Option* AddText(CLI::App* command, const char* name, TTarget& target, const char* description)
-{
-    return command->add_option(name, target, description)->transform(&UnguardBrackets)->check(&RefuseEmpty);
 }
 
 void AddFormat(CLI::App* command, EOutputFormat& format)
@@ -118,6 +109,7 @@ void TCommands::AddCompare()
             "a rules file that says what to compare, or - for standard input (default: everything)")
         ->option_text("RULES");
     AddFormat(command, fCompare.format);
+    AddLoadingOptions(command, fCompare.loading);
     AddOutput(command, fCompare.output);
     AddStrictSchema(command, fCompare.strictSchema);
     command->add_flag("--allow-empty", fCompare.allowEmpty, "do not take it for an error if nothing was compared");
@@ -133,6 +125,7 @@ void TCommands::AddCheck()
     AddText(command, "RULES", fCheck.rules, "the rules file, or - for standard input")->required()->option_text(" ");
     AddSchemas(command, fCheck.schemas);
     AddStrictSchema(command, fCheck.strictSchema);
+    AddLoadingOptions(command, fCheck.loading);
     AddOutput(command, fCheck.output);
 }
 
@@ -148,6 +141,7 @@ void TCommands::AddExplain()
         ->option_text("RULES");
     AddSchemas(command, fExplain.schemas)->required();
     AddStrictSchema(command, fExplain.strictSchema);
+    AddLoadingOptions(command, fExplain.loading);
     AddOutput(command, fExplain.output);
 }
 
@@ -160,6 +154,7 @@ void TCommands::AddQuery()
     AddText(command, "QUERY", fQuery.query, "WQL: SELECT * | name, ... FROM class [WHERE ...]")->required()->option_text(" ");
     AddText(command, "INVENTORY", fQuery.inventory, kInventoryHelp)->required()->option_text(" ");
     AddFormat(command, fQuery.format);
+    AddLoadingOptions(command, fQuery.loading);
     AddOutput(command, fQuery.output);
 }
 
@@ -173,6 +168,7 @@ void TCommands::AddShow()
     AddText(command, "INVENTORY", fShow.inventory, kInventoryHelp)->required()->option_text(" ");
     AddText(command, "CLASS", fShow.className, "show the instances of this class and of the classes below it")->option_text(" ");
     AddFormat(command, fShow.format);
+    AddLoadingOptions(command, fShow.loading);
     AddOutput(command, fShow.output);
 }
 

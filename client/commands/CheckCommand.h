@@ -3,6 +3,7 @@
 #include <string>
 #include <vector>
 
+#include "client/inventory/TLoadingOptions.h"
 #include "client/process/IConsole.h"
 
 namespace NORVZEL20 {
@@ -13,6 +14,7 @@ struct TCheckOptions {
     std::vector<std::string> schemas;  ///< inventories, the reference first; none: only what needs no inventory is checked
     std::string output;                ///< empty: standard output
     bool strictSchema = false;         ///< whether the inventories are left as they are
+    TLoadingOptions loading;
 };
 
 /// Writes what a rules file says and what follows from it. Returns kExitSuccess (0). Errors: TClientError, also for rules that a

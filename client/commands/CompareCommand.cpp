@@ -33,7 +33,7 @@ int RunCompare(const TCompareOptions& options, IConsole& console)
     paths.insert(paths.end(), options.others.begin(), options.others.end());
     // Before the inventories, which may take long to load.
     const std::optional<TRulesText> rules = ReadRulesFor(paths, options.rules);
-    std::vector<TInventory> inventories = TInventoryLoader(console).Load(paths);
+    std::vector<TInventory> inventories = TInventoryLoader(console, options.loading).Load(paths);
     const TComparisonReport report = TComparison(inventories, console).Run(rules, options.strictSchema);
     if (!options.allowEmpty && report.coverage.IsNothingCompared()) {
         throw TClientError(DescribeNothingCompared(report, options.rules, options.strictSchema));

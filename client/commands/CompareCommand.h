@@ -3,6 +3,7 @@
 #include <string>
 #include <vector>
 
+#include "client/inventory/TLoadingOptions.h"
 #include "client/process/IConsole.h"
 #include "client/report/EOutputFormat.h"
 
@@ -17,6 +18,7 @@ struct TCompareOptions {
     std::string output;  ///< empty: standard output
     bool strictSchema = false;
     bool allowEmpty = false;  ///< whether it is no error if nothing was compared
+    TLoadingOptions loading;
 };
 
 /// Compares inventories. Returns kExitSuccess (0) for no differences, otherwise kExitDifferences (1). Errors: TClientError, also if

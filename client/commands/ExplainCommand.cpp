@@ -37,7 +37,7 @@ int RunExplain(const TExplainOptions& options, IConsole& console)
 {
     const TAskedElement element = Split(options.element);
     const std::optional<TRulesText> rules = ReadRulesFor(options.schemas, options.rules);
-    std::vector<TInventory> inventories = TInventoryLoader(console).Load(options.schemas);
+    std::vector<TInventory> inventories = TInventoryLoader(console, options.loading).Load(options.schemas);
     std::vector<TSchemaNote> notes;
     if (!options.strictSchema) {
         notes = CompleteInventories(inventories, console);

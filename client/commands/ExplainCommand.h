@@ -3,6 +3,7 @@
 #include <string>
 #include <vector>
 
+#include "client/inventory/TLoadingOptions.h"
 #include "client/process/IConsole.h"
 
 namespace NORVZEL20 {
@@ -14,6 +15,7 @@ struct TExplainOptions {
     std::vector<std::string> schemas;  ///< inventories, the reference first; at least one
     std::string output;                ///< empty: standard output
     bool strictSchema = false;         ///< whether the inventories are left as they are
+    TLoadingOptions loading;
 };
 
 /// Writes which rule decides how a class or a property is treated. Returns kExitSuccess (0). Errors: TClientError.

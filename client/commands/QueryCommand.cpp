@@ -16,7 +16,7 @@ int RunQuery(const TQueryOptions& options, IConsole& console)
     try {
         // Parsed first: a wrong query is reported without waiting for the inventory.
         const TQuery query("WQL", options.query);
-        const TInventory inventory = TInventoryLoader(console).LoadOne(options.inventory);
+        const TInventory inventory = TInventoryLoader(console, options.loading).LoadOne(options.inventory);
         const auto instances = Collect<ICIMInstance>([&](const auto& callback) { query.Execute(*inventory.ns, callback); });
         DeliverResult(console, options.output, WriteInstances(inventory, instances, query.GetProperties(), options.format));
     } catch (const TQueryError& error) {

@@ -2,6 +2,7 @@
 
 #include <string>
 
+#include "client/inventory/TLoadingOptions.h"
 #include "client/process/IConsole.h"
 #include "client/report/EOutputFormat.h"
 
@@ -13,6 +14,7 @@ struct TQueryOptions {
     std::string inventory;
     EOutputFormat format = EOutputFormat::kText;
     std::string output;  ///< empty: standard output
+    TLoadingOptions loading;
 };
 
 /// Writes the instances of an inventory that match a query in WQL. Returns kExitSuccess (0). Errors: TClientError.

@@ -23,7 +23,7 @@ std::string Write(const TInventory& inventory, const TShowOptions& options)
 
 int RunShow(const TShowOptions& options, IConsole& console)
 {
-    const TInventory inventory = TInventoryLoader(console).LoadOne(options.inventory);
+    const TInventory inventory = TInventoryLoader(console, options.loading).LoadOne(options.inventory);
     DeliverResult(console, options.output, Write(inventory, options));
     return kExitSuccess;
 }

@@ -2,6 +2,7 @@
 
 #include <string>
 
+#include "client/inventory/TLoadingOptions.h"
 #include "client/process/IConsole.h"
 #include "client/report/EOutputFormat.h"
 
@@ -13,6 +14,7 @@ struct TShowOptions {
     std::string className;  ///< empty: the classes are listed
     EOutputFormat format = EOutputFormat::kText;
     std::string output;  ///< empty: standard output
+    TLoadingOptions loading;
 };
 
 /// Writes what an inventory holds: its classes, or the instances of one class and those below it. Returns kExitSuccess (0).

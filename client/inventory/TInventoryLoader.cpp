@@ -21,7 +21,7 @@
 #include "client/process/TClientError.h"
 #include "client/process/TProgress.h"
 #include "client/process/TSignalsHeld.h"
-#include "embedded/cimxml/TCimXmlPopulator.h"
+#include "embedded/cimxml/TCimXmlDocuments.h"
 
 namespace NORVZEL20 {
 
@@ -31,13 +31,14 @@ const char kNamespaceName[] = "root/cimv2";
 const std::size_t kFewestAtOnce = 2;
 const std::size_t kMostAtOnce = 16;
 
-void LoadInto(TInventory& inventory)
+void LoadInto(TInventory& inventory, const TLoadingOptions& options)
 {
     TInventoryFile file(inventory.path);
-    TCimXmlPopulator populator(inventory.ns);
     try {
-        inventory.loaded =
-            populator.LoadFromSource([&file](char* buffer, std::size_t size) { return file.Read(buffer, size); }, file.GetName());
+        TLoadSession session(inventory.ns, file.GetName(), options.load);
+        TCimXmlDocuments(session).ReadSource([&file](char* buffer, std::size_t size) { return file.Read(buffer, size); },
+                                             file.GetName());
+        inventory.loaded = session.Commit();
     } catch (const TPopulateError& error) {
         // The text may be malformed only because the compressed file is damaged.
         file.CheckRest();
@@ -60,8 +61,8 @@ TInventory Prepare(const std::string& path, const std::string& label)
 // Loads inventories on the calling thread and on helper threads.
 class TParallelLoad {
   public:
-    explicit TParallelLoad(std::vector<TInventory>& inventories)
-        : fInventories(inventories), fFaults(inventories.size()), fNext(CountAtOnce(inventories.size()))
+    TParallelLoad(std::vector<TInventory>& inventories, const TLoadingOptions& options)
+        : fInventories(inventories), fOptions(options), fFaults(inventories.size()), fNext(CountAtOnce(inventories.size()))
     {}
 
     // Errors: that of the first inventory that cannot be loaded.
@@ -115,13 +116,14 @@ class TParallelLoad {
     void TryLoad(std::size_t i) noexcept
     {
         try {
-            LoadInto(fInventories[i]);
+            LoadInto(fInventories[i], fOptions);
         } catch (...) {
             fFaults[i] = std::current_exception();
         }
     }
 
     std::vector<TInventory>& fInventories;
+    const TLoadingOptions& fOptions;
     std::vector<std::exception_ptr> fFaults;  // one for each inventory; null if it was loaded
     std::atomic<std::size_t> fNext;           // the first inventory that no thread has taken
 };
@@ -138,7 +140,7 @@ std::vector<TInventory> TInventoryLoader::Load(const std::vector<std::string>& p
     }
     {
         const TProgress progress(fConsole, paths.size() == 1 ? "loading the inventory" : "loading the inventories");
-        TParallelLoad(inventories).Run();
+        TParallelLoad(inventories, fOptions).Run();
     }
     for (const TInventory& inventory : inventories) {
         ReportTolerated(inventory);

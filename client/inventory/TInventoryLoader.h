@@ -1,9 +1,11 @@
 #pragma once
 
 #include <string>
+#include <utility>
 #include <vector>
 
 #include "client/inventory/TInventory.h"
+#include "client/inventory/TLoadingOptions.h"
 #include "client/process/IConsole.h"
 
 namespace NORVZEL20 {
@@ -13,7 +15,7 @@ namespace NORVZEL20 {
 class TInventoryLoader {
   public:
     /// `console` must outlive this. It shows the progress, and a message for each fault that was tolerated in a file.
-    explicit TInventoryLoader(IConsole& console) : fConsole(console) {}
+    explicit TInventoryLoader(IConsole& console, TLoadingOptions options = {}) : fConsole(console), fOptions(std::move(options)) {}
 
     /// The inventories in the order of `paths`, of which one may be "-" for standard input.
     /// Errors: TClientError that names file, line and column, as far as they are known. If several inventories cannot be loaded,
@@ -27,6 +29,7 @@ class TInventoryLoader {
     void ReportTolerated(const TInventory& inventory);
 
     IConsole& fConsole;
+    TLoadingOptions fOptions;
 };
 
 }  // namespace NORVZEL20

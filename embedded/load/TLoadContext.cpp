@@ -10,8 +10,17 @@
 
 #include "embedded/load/MessageText.h"
 #include "embedded/value/TNameText.h"
+#include "embedded/value/Trim.h"
 
 namespace NORVZEL20 {
+
+TLoadContext::TLoadContext(TLoadOptions options) : fOptions(std::move(options))
+{
+    const std::string_view name = Trim(fOptions.namespaceName, "/");
+    if (!name.empty()) {
+        fReport.namespaceName = name;
+    }
+}
 
 TLoadContext::~TLoadContext() = default;
 

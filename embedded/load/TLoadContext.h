@@ -8,6 +8,7 @@
 #include <vector>
 
 #include "embedded/load/IPlaceSource.h"
+#include "embedded/load/TLoadOptions.h"
 #include "embedded/load/TLoadPlace.h"
 #include "embedded/load/TLoadReport.h"
 #include "embedded/load/TOwnPlaceSearch.h"
@@ -43,6 +44,8 @@ class CIMDELTA_INTERNAL_EXPORT TLoadContext {
 
     /// `embeddedDepth` is how many embedded objects what is read stands in.
     explicit TLoadContext(std::size_t embeddedDepth = 0) noexcept : fEmbeddedDepth(embeddedDepth) {}
+    /// For what stands in no embedded object.
+    explicit TLoadContext(TLoadOptions options);
     TLoadContext(const TLoadContext&) = delete;
     TLoadContext& operator=(const TLoadContext&) = delete;
     ~TLoadContext();
@@ -69,6 +72,7 @@ class CIMDELTA_INTERNAL_EXPORT TLoadContext {
     /// Errors: fails with kParseError (9) for a namespace or a host that is not the first one.
     void NoteNamespace(const std::string& name, const std::string& host);
 
+    const TLoadOptions& GetOptions() const noexcept { return fOptions; }
     TLoadReport& GetReport() noexcept { return fReport; }
     /// Decides which references stay within the document's own namespace.
     TOwnPlaceSearch& GetOwnPlace() noexcept { return fOwnPlace; }
@@ -108,7 +112,8 @@ class CIMDELTA_INTERNAL_EXPORT TLoadContext {
     TOwnPlaceSearch fOwnPlace{fReport};
     std::vector<const char*> fKinds;  // of the entries of fReport.tolerated
     TTextPool fTexts;
-    std::size_t fEmbeddedDepth;  // embedded objects that are being read, one inside of the other
+    TLoadOptions fOptions;
+    std::size_t fEmbeddedDepth = 0;  // embedded objects that are being read, one inside of the other
 };
 
 }  // namespace NORVZEL20

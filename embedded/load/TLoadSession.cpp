@@ -12,7 +12,9 @@ namespace NORVZEL20 {
 /// What the documents of one load share. The loader takes back what it added, unless it was committed.
 class TLoadSession::TParts {
   public:
-    explicit TParts(const boost::shared_ptr<TInMemNamespace>& ns) : fNamespace(ns), fLoader(fContext, ns) {}
+    TParts(const boost::shared_ptr<TInMemNamespace>& ns, const TLoadOptions& options)
+        : fNamespace(ns), fContext(options), fLoader(fContext, ns)
+    {}
 
     boost::shared_ptr<TInMemNamespace> fNamespace;
     TLoadContext fContext;
@@ -35,8 +37,8 @@ boost::shared_ptr<TInMemNamespace> RequireInMem(const boost::shared_ptr<ICIMName
 
 }  // namespace
 
-TLoadSession::TLoadSession(const boost::shared_ptr<ICIMNamespace>& ns, const std::string& name)
-    : fParts(std::make_unique<TParts>(RequireInMem(ns, name)))
+TLoadSession::TLoadSession(const boost::shared_ptr<ICIMNamespace>& ns, const std::string& name, const TLoadOptions& options)
+    : fParts(std::make_unique<TParts>(RequireInMem(ns, name), options))
 {}
 
 TLoadSession::~TLoadSession() = default;

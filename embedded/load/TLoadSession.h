@@ -5,6 +5,7 @@
 #include <memory>
 #include <vector>
 
+#include "embedded/load/TLoadOptions.h"
 #include "embedded/load/TLoadReport.h"
 #include "host/Export.h"
 #include "host/ICIMElement.h"
@@ -31,7 +32,7 @@ class CIMDELTA_EXPORT TLoadSession {
 
     /// Loads into `ns`, which must be a namespace of the provider "inmem" and is kept alive. `name` is for messages only. Errors:
     /// TPopulateError with kNotSupported (31) for another namespace.
-    TLoadSession(const boost::shared_ptr<ICIMNamespace>& ns, const std::string& name);
+    TLoadSession(const boost::shared_ptr<ICIMNamespace>& ns, const std::string& name, const TLoadOptions& options = {});
     TLoadSession(const TLoadSession&) = delete;
     TLoadSession& operator=(const TLoadSession&) = delete;
     ~TLoadSession();

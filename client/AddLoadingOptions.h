@@ -1,0 +1,13 @@
+#pragma once
+
+#include <CLI/CLI.hpp>
+
+#include "client/inventory/TLoadingOptions.h"
+
+namespace NORVZEL20 {
+
+/// Adds the options that say how inventories are loaded, the same ones for every command. `loading` is filled while the command
+/// line is parsed. It must live as long as the command.
+void AddLoadingOptions(CLI::App* command, TLoadingOptions& loading);
+
+}  // namespace NORVZEL20
