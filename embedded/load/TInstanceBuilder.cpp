@@ -146,6 +146,23 @@ void TInstanceBuilder::Fill(const TDraft& draft, const TReadObjects& readObjects
         const bool isOpen = Localize(value);
         SetProperty(target, std::move(value), isOpen);
     }
+    if (draft.takesDefaults) {
+        FillDefaults();
+    }
+}
+
+/// Static properties have their defaults already.
+void TInstanceBuilder::FillDefaults()
+{
+    for (TLoadTarget* target = fLayout->first; target != nullptr; target = target->next) {
+        TCIMValue value = fLayout->cls->GetLayout().GetDecl(target->slot).GetDefaultValue();
+        if (target->isStatic || value.IsNull() || target->given == fNumber) {
+            continue;
+        }
+        target->given = fNumber;
+        const bool isOpen = Localize(value);
+        SetProperty(*target, std::move(value), isOpen);
+    }
 }
 
 boost::shared_ptr<TInMemInstance> TInstanceBuilder::Take(const TOwnKeys* ownKeys)

@@ -78,6 +78,7 @@ class TInstanceBuilder {
     void SetStatic(const TLoadTarget& target, const TCIMValue& value);
     TCIMValue Convert(const TLoadTarget& target, const TCIMValue& value);
     bool Localize(TCIMValue& value) const;
+    void FillDefaults();
     void FillKeys(const TOwnKeys& keys);
 
     TLoadContext& fContext;

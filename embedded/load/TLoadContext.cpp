@@ -27,13 +27,13 @@ TLoadContext::~TLoadContext() = default;
 void TLoadContext::BeginDocument(std::string name, const IPlaceSource& reader)
 {
     fDocuments.push_back(std::move(name));
-    fReader = &reader;
+    ResumeDocument(fDocuments.size() - 1, reader);
 }
 
 void TLoadContext::EndDocument()
 {
     fEnd = GetPlace();
-    fReader = nullptr;
+    fOpen.pop_back();
 }
 
 void TLoadContext::Fail(TZELStatusCode::EStatusCode status, const std::string& message) const
@@ -58,7 +58,7 @@ TLoadPlace TLoadContext::GetPlace() const
     if (fPlace) {
         return *fPlace;
     }
-    return fReader != nullptr ? TLoadPlace{fDocuments.size() - 1, fReader->GetPlace()} : fEnd;
+    return fOpen.empty() ? fEnd : TLoadPlace{fOpen.back().number, fOpen.back().reader->GetPlace()};
 }
 
 void TLoadContext::Tolerate(const char* kind, const std::string& text)

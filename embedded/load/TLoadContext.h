@@ -50,9 +50,12 @@ class CIMDELTA_INTERNAL_EXPORT TLoadContext {
     TLoadContext& operator=(const TLoadContext&) = delete;
     ~TLoadContext();
 
-    /// Begins a document. `name` is what messages call it, and `reader` knows the place in it, until EndDocument.
+    /// Begins a document, perhaps within another one. `name` is what messages call it, and `reader` knows the place in it, until
+    /// EndDocument.
     void BeginDocument(std::string name, const IPlaceSource& reader);
-    /// Ends the document. What fails after it, outside of any TAt, is reported at its end.
+    /// Goes on with a document that has ended, until EndDocument. `number` is that of the document.
+    void ResumeDocument(std::size_t number, const IPlaceSource& reader) { fOpen.push_back({number, &reader}); }
+    /// Ends the document that was begun last. What fails after it, outside of any document and TAt, is reported at its end.
     void EndDocument();
 
     /// Ends the load. `message` says what was found and what was expected or can be done.
@@ -104,10 +107,15 @@ class CIMDELTA_INTERNAL_EXPORT TLoadContext {
     }
 
   private:
-    std::vector<std::string> fDocuments;    // their names
-    const IPlaceSource* fReader = nullptr;  // of the document that is open
-    TLoadPlace fEnd;                        // of the document that was ended last
-    std::optional<TLoadPlace> fPlace;       // of the innermost TAt
+    struct TOpen {
+        std::size_t number;  // of the document
+        const IPlaceSource* reader;
+    };
+
+    std::vector<std::string> fDocuments;  // their names
+    std::vector<TOpen> fOpen;             // the innermost document comes last
+    TLoadPlace fEnd;                      // of the document that was ended last
+    std::optional<TLoadPlace> fPlace;     // of the innermost TAt
     TLoadReport fReport;
     TOwnPlaceSearch fOwnPlace{fReport};
     std::vector<const char*> fKinds;  // of the entries of fReport.tolerated

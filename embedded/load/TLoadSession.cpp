@@ -3,6 +3,7 @@
 #include <string>
 #include <utility>
 
+#include "embedded/load/ILateDocuments.h"
 #include "embedded/load/TLoadContext.h"
 #include "embedded/load/TLoader.h"
 #include "embedded/store/TInMemNamespace.h"
@@ -16,9 +17,24 @@ class TLoadSession::TParts {
         : fNamespace(ns), fContext(options), fLoader(fContext, ns)
     {}
 
+    /// Instances that have waited need their classes, whichever document declares them.
+    void AddLate()
+    {
+        for (const boost::shared_ptr<ILateDocuments>& documents : fLate) {
+            documents->AddClasses();
+        }
+        if (!fLate.empty()) {
+            fLoader.DeclareClasses();
+        }
+        for (const boost::shared_ptr<ILateDocuments>& documents : fLate) {
+            documents->AddInstances();
+        }
+    }
+
     boost::shared_ptr<TInMemNamespace> fNamespace;
     TLoadContext fContext;
     TLoader fLoader;
+    std::vector<boost::shared_ptr<ILateDocuments>> fLate;
     TReadObjects fReadObjects = [](const TCIMValue& value) { return value; };
     std::vector<boost::shared_ptr<ICIMElement>> fElements;
 };
@@ -51,7 +67,10 @@ void TLoadSession::KeepElements()
 TLoadReport TLoadSession::Commit()
 {
     TLoader& loader = fParts->fLoader;
-    fParts->fContext.Guard([&] { loader.Finish(fParts->fReadObjects); });
+    fParts->fContext.Guard([&] {
+        fParts->AddLate();
+        loader.Finish(fParts->fReadObjects);
+    });
     fParts->fElements = loader.TakeElements();
     loader.Commit();
     return std::move(fParts->fContext.GetReport());
@@ -75,6 +94,11 @@ TLoader& TLoadSession::GetLoader() noexcept
 const boost::shared_ptr<TInMemNamespace>& TLoadSession::GetNamespace() const noexcept
 {
     return fParts->fNamespace;
+}
+
+void TLoadSession::AddLate(const boost::shared_ptr<ILateDocuments>& documents)
+{
+    fParts->fLate.push_back(documents);
 }
 
 void TLoadSession::SetObjectReader(const TReadObjects& readObjects)

@@ -14,6 +14,7 @@
 
 namespace NORVZEL20 {
 
+class ILateDocuments;
 class TInMemNamespace;
 class TLoadContext;
 class TLoader;
@@ -53,6 +54,8 @@ class CIMDELTA_EXPORT TLoadSession {
     TLoader& GetLoader() noexcept;
     const boost::shared_ptr<TInMemNamespace>& GetNamespace() const noexcept;
     void SetObjectReader(const TReadObjects& readObjects);
+    /// Keeps `documents`, which Commit asks for what has waited. The first one added is asked first.
+    void AddLate(const boost::shared_ptr<ILateDocuments>& documents);
 
   private:
     class TParts;

@@ -52,6 +52,9 @@ class CIMDELTA_INTERNAL_EXPORT TLoader {
     void EndInstance(const TOwnKeys* ownKeys);
     void AddInstance(TDraft draft) { fLate.Wait(std::move(draft)); }
 
+    /// Declares the classes that wait. Call it at the end of the documents, if something needs the classes before Finish. Errors:
+    /// as Finish.
+    void DeclareClasses() { fClasses.DeclareAll(); }
     /// Adds what waits. Call it at the end of the document. Errors: kNotFound (15) for a class that never came, and those of the
     /// others.
     void Finish(const TReadObjects& readObjects);
