@@ -1,0 +1,179 @@
+// From what MOF documents declare to a load:
+//
+//     bytes --DecodeMof--> text --TMofLexer--> tokens --TMofParser--> TMofReader --> TLoader of the session
+//
+// Qualifiers and classes go to the loader at once. An instance says no types and may refer to later ones by their aliases, so
+// instances wait until the classes of all documents are declared. So do classes with a qualifier that is not declared yet, until
+// all documents have been read.
+//
+// An included document is read where the pragma stands. A file is read once, however often it is included; a file that includes
+// itself, perhaps through others, is an error.
+#include "embedded/mof/TMofReader.h"
+
+#include <algorithm>
+#include <utility>
+
+#include "embedded/load/MessageText.h"
+#include "embedded/load/TLoadContext.h"
+#include "embedded/load/TLoader.h"
+#include "embedded/mof/DecodeMof.h"
+#include "embedded/mof/TMofInstanceMaker.h"
+#include "embedded/mof/TMofLimits.h"
+#include "embedded/mof/TMofParser.h"
+#include "embedded/store/TInMemNamespace.h"
+#include "embedded/value/Trim.h"
+
+namespace NORVZEL20 {
+
+using EStatus = TZELStatusCode::EStatusCode;
+
+TMofReader::TMofReader(TLoadSession& session, boost::shared_ptr<IMofIncludes> includes)
+    : fSession(session), fContext(session.GetContext()), fIncludes(std::move(includes))
+{}
+
+void TMofReader::Read(std::string bytes, const std::string& name)
+{
+    fUnits.emplace_back();
+    fIncluded.clear();
+    fNamespaceName.clear();
+    fHost.clear();
+    fOpenFiles.clear();
+    ReadDocument(std::move(bytes), name);
+}
+
+void TMofReader::ReadDocument(std::string bytes, const std::string& name)
+{
+    const bool isEmpty = bytes.empty() && fOpenNames.empty();
+    std::string problem;
+    const std::string text = DecodeMof(std::move(bytes), problem);
+    problem = isEmpty ? "found an empty document, expected MOF" : problem;
+    TMofTokens tokens(fContext, text);
+    fContext.BeginDocument(name, tokens.GetReader());
+    if (!problem.empty()) {
+        fContext.Fail(EStatus::kParseError, problem);
+    }
+    fOpenNames.push_back(name);
+    TMofParser(tokens, text, *this).Parse();
+    fOpenNames.pop_back();
+    fContext.EndDocument();
+}
+
+boost::shared_ptr<TInMemQualifierDecl> TMofReader::FindQualifierDecl(const std::string& name)
+{
+    return fSession.GetNamespace()->FindQualifierDecl(name);
+}
+
+void TMofReader::OnQualifierDecl(const TQualifierDraft& draft)
+{
+    fSession.GetLoader().AddQualifierDecl(draft);
+}
+
+void TMofReader::OnClass(TDraft draft)
+{
+    fSession.GetLoader().AddClass(std::move(draft));
+}
+
+bool TMofReader::OnUndeclared(TMofPart part)
+{
+    if (!fIsLast) {
+        fParts.push_back(std::move(part));
+    }
+    return fIsLast;
+}
+
+void TMofReader::OnInstance(TMofInstance instance)
+{
+    NoteNamespace();
+    fUnits.back().push_back(std::move(instance));
+}
+
+void TMofReader::OnPragma(const std::string& name, const std::string& text)
+{
+    if (TNameText::Equal(name, "include")) {
+        Include(text);
+    } else if (TNameText::Equal(name, "namespace")) {
+        SetNamespace(text);
+    }
+}
+
+void TMofReader::Include(const std::string& name)
+{
+    const std::string found = "found an include of " + Quote(name) + ", ";
+    if (!fIncludes) {
+        fContext.Fail(EStatus::kParseError, found + "but no folders are given for included files; give the folder that it is in");
+    }
+    IMofIncludes::TFile file;
+    std::string reason;
+    if (!fIncludes->Find(name, fOpenNames.back(), file, reason)) {
+        fContext.Fail(EStatus::kParseError, found + reason);
+    }
+    if (std::find(fOpenFiles.begin(), fOpenFiles.end(), file.identity) != fOpenFiles.end()) {
+        fContext.Fail(EStatus::kParseError, found + "which includes this document; remove one of the two");
+    }
+    if (!fIncluded.insert(file.identity).second) {
+        return;
+    }
+    if (fOpenFiles.size() > TMofLimits::kMaxIncludeDepth || fIncluded.size() > TMofLimits::kMaxIncluded) {
+        fContext.Fail(EStatus::kParseError, found + "which is one too many or too deep; join some of the files");
+    }
+    std::string bytes;
+    if (!fIncludes->Read(file, TMofLimits::kMaxBytes, bytes, reason)) {
+        fContext.Fail(EStatus::kFileError, found + reason);
+    }
+    fOpenFiles.push_back(file.identity);
+    ReadDocument(std::move(bytes), file.name);
+    fOpenFiles.pop_back();
+}
+
+/// Forms in use: root/cimv2, /root/cimv2, //host/root/cimv2, http://host/root/cimv2, and the same with backslashes. The host "."
+/// is this one.
+void TMofReader::SetNamespace(std::string text)
+{
+    std::replace(text.begin(), text.end(), '\\', '/');
+    fNamespacePlace = fContext.GetPlace();
+    fHost.clear();
+    const std::size_t slashes = text.find("//");
+    if (slashes != std::string::npos) {
+        const std::size_t end = std::min(text.find('/', slashes + 2), text.size());
+        fHost = text.substr(slashes + 2, end - slashes - 2);
+        fHost = fHost == "." ? "" : fHost;
+        text.erase(0, end);
+    }
+    fNamespaceName = std::string(Trim(text, "/"));
+    if (fNamespaceName.find_first_of(":=\"") != std::string::npos) {
+        fContext.Fail(EStatus::kParseError,
+                      "found namespace " + Quote(fNamespaceName) + ", expected a name without colons, equals signs and quotes");
+    }
+}
+
+/// A namespace matters to instances only: the classes of a schema go where they are needed.
+void TMofReader::NoteNamespace()
+{
+    if (!fNamespaceName.empty()) {
+        const TLoadContext::TAt at(fContext, fNamespacePlace);
+        fContext.NoteNamespace(fNamespaceName, fHost);
+    }
+}
+
+void TMofReader::AddClasses()
+{
+    fIsLast = true;
+    for (const TMofPart& part : std::exchange(fParts, {})) {
+        TMofTokens tokens(fContext, part.text, part.place.place);
+        fContext.ResumeDocument(part.place.document, tokens.GetReader());
+        TMofParser(tokens, part.text, *this).Parse();
+        fContext.EndDocument();
+    }
+}
+
+void TMofReader::AddInstances()
+{
+    for (const TInstances& unit : std::exchange(fUnits, {})) {
+        TMofInstanceMaker maker(fContext, *fSession.GetNamespace(), *this, unit);
+        for (const TMofInstance& instance : unit) {
+            fSession.GetLoader().AddInstance(maker.Make(instance));
+        }
+    }
+}
+
+}  // namespace NORVZEL20
