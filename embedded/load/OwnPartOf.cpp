@@ -6,7 +6,8 @@
 // is whether the element says anything else than what is inherited.
 //
 // An element may say less than what is inherited: an answer without qualifiers lists none. Saying less is not saying otherwise, so
-// only what the element does say is compared.
+// only what the element does say is compared. An override without a default has none, as it has none without the mark: writers that
+// mark elements repeat the default that is inherited.
 #include "embedded/load/OwnPartOf.h"
 
 #include <algorithm>
@@ -64,7 +65,7 @@ bool IsInherited(const TEmbeddedObject::TQualifier& qualifier, const TInMemQuali
         return false;
     }
     const boost::shared_ptr<ICIMQualifier> found = above->Find(qualifier.name);
-    return found && HasValueOf(qualifier, *found);
+    return found && (found->GetFlavor(TCallContext()) & ICIMQualifierDecl::kFlavorToSubclass) != 0 && HasValueOf(qualifier, *found);
 }
 
 std::optional<TEmbeddedObject::TProperty> OwnPartOf(const TEmbeddedObject::TProperty& property, const TInMemPropertyDecl& above)
@@ -78,7 +79,6 @@ std::optional<TEmbeddedObject::TProperty> OwnPartOf(const TEmbeddedObject::TProp
         return std::nullopt;
     }
     TEmbeddedObject::TProperty own = property;
-    own.value = hasDefault ? own.value : above.GetDefaultValue();
     own.referenceClass = hasClass ? own.referenceClass : above.GetReferenceClass();
     own.arraySize = hasSize ? own.arraySize : above.GetArraySize();
     DropInherited(own.qualifiers, above.GetQualifiers());

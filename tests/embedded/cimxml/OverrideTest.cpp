@@ -86,7 +86,7 @@ class OverrideTest : public testing::Test {
 
 TEST_F(OverrideTest, AKeyThatOnlyTheSubclassDeclaresIsItsKey)
 {
-    EXPECT_EQ("Name [0] = none Key(TRUE)\n", OwnOf(Name(Qualifier("Key", "TRUE"))));
+    EXPECT_EQ("Name [0] = NULL Key(TRUE)\n", OwnOf(Name(Qualifier("Key", "TRUE"))));
     EXPECT_TRUE(fLoading.GetNamespace()->FindClass("Sub")->FindPropertyDecl("Name")->IsKey());
     EXPECT_FALSE(fLoading.GetNamespace()->FindClass("Base")->FindPropertyDecl("Name")->IsKey());
 }
@@ -105,14 +105,17 @@ TEST_F(OverrideTest, AMarkedElementIsAnOverrideOnlyIfItSaysSomethingElse)
         {Name("<VALUE>other</VALUE>"), "Name [0] = other\n"},
         {Name(Qualifier("Description", "the name")), ""},
         {Name(Qualifier("DESCRIPTION", "the name", kPropagated)), ""},
-        {Name(Qualifier("Description", "another")), "Name [0] = none Description(another)\n"},
-        {Name(Qualifier("Description", "another", kPropagated)), "Name [0] = none Description(another)\n"},
-        {Name(Qualifier("Description", "the name", "TOSUBCLASS=\"false\"")), "Name [0] = none Description(the name)\n"},
+        {Name(Qualifier("Description", "another")), "Name [0] = NULL Description(another)\n"},
+        {Name(Qualifier("Description", "another", kPropagated)), "Name [0] = NULL Description(another)\n"},
+        {Name(Qualifier("Description", "the name", "TOSUBCLASS=\"false\"")), "Name [0] = NULL Description(the name)\n"},
         {Name(Qualifier("Description", "the name", std::string("TOSUBCLASS=\"false\"") + kPropagated)), ""},
         {Name(Qualifier("Override", "Old", kPropagated)), ""},
         {Name(Qualifier("Override", "Old", "TOSUBCLASS=\"false\"")), ""},
-        {Name(Qualifier("Override", "Name")), "Name [0] = none Override(Name)\n"},
-        {Name(Qualifier("MaxLen", "9") + Qualifier("Description", "the name", kPropagated)), "Name [0] = none MaxLen(9)\n"},
+        {Name(Qualifier("MaxLen", "9") + Qualifier("Override", "Old", std::string("TOSUBCLASS=\"false\"") + kPropagated)),
+         "Name [0] = NULL MaxLen(9) Override(Old)\n"},
+        {Name(Qualifier("MaxLen", "9") + "<VALUE>none</VALUE>"), "Name [0] = none MaxLen(9)\n"},
+        {Name(Qualifier("Override", "Name")), "Name [0] = NULL Override(Name)\n"},
+        {Name(Qualifier("MaxLen", "9") + Qualifier("Description", "the name", kPropagated)), "Name [0] = NULL MaxLen(9)\n"},
         {array + "></PROPERTY.ARRAY>", ""},
         {array + " ARRAYSIZE=\"4\"></PROPERTY.ARRAY>", ""},
         {array + " ARRAYSIZE=\"5\"></PROPERTY.ARRAY>", "Tags [5] = NULL\n"},
