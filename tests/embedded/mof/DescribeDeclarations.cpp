@@ -83,7 +83,7 @@ void AddClassTreeLines(TLines& lines, ICIMClass& cls)
     cls.EnumerateSubClasses(add, false, TCallContext());
 }
 
-TLines DescribeDeclarations(TInMemNamespace& ns)
+TLines DescribeDeclarations(TInMemNamespace& ns, const std::string& ignored)
 {
     TLines lines;
     const auto addQualifier = [&](const boost::shared_ptr<ICIMQualifierDecl>& decl) {
@@ -95,6 +95,8 @@ TLines DescribeDeclarations(TInMemNamespace& ns)
     ns.EnumerateQualifierDecls(addQualifier, TCallContext());
     AddClassTreeLines(lines, *ns.GetClass("<root>", TCallContext()));
     for (std::string& line : lines) {
+        const auto isIgnored = [&](char c) { return ignored.find(c) != std::string::npos; };
+        line.erase(std::remove_if(line.begin(), line.end(), isIgnored), line.end());
         std::replace(line.begin(), line.end(), '\n', '|');
     }
     std::sort(lines.begin(), lines.end());
@@ -103,10 +105,10 @@ TLines DescribeDeclarations(TInMemNamespace& ns)
 
 }  // namespace
 
-std::string DiffDeclarations(TInMemNamespace& left, TInMemNamespace& right)
+std::string DiffDeclarations(TInMemNamespace& left, TInMemNamespace& right, const std::string& ignored)
 {
-    const TLines lefts = DescribeDeclarations(left);
-    const TLines rights = DescribeDeclarations(right);
+    const TLines lefts = DescribeDeclarations(left, ignored);
+    const TLines rights = DescribeDeclarations(right, ignored);
     std::string text;
     auto a = lefts.begin();
     auto b = rights.begin();
