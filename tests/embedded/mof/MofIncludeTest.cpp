@@ -1,0 +1,192 @@
+#include <gtest/gtest.h>
+
+#include <boost/smart_ptr/make_shared.hpp>
+#include <filesystem>
+#include <fstream>
+#include <string>
+
+#include "embedded/mof/TMofFolders.h"
+#include "embedded/mof/TMofPopulator.h"
+#include "tests/embedded/mof/TMofLoading.h"
+
+namespace NORVZEL20 {
+namespace {
+
+std::string Include(const std::string& name)
+{
+    return "#pragma include (\"" + name + "\")\n";
+}
+
+TEST(MofIncludeTest, AFileIsReadInItsPlaceAndOnce)
+{
+    TMofLoading loading;
+    loading.File("quals.mof", "Qualifier Key : boolean = false, Scope(any), Flavor(DisableOverride);")
+        .File("disk.mof", Include("quals.mof") + "class Disk { [Key] string Id; };");
+    const TLoadReport report =
+        loading.Load(Include("disk.mof") + Include("quals.mof") + Include("disk.mof") + "instance of Disk { Id = \"a\"; };");
+    EXPECT_EQ(1u, report.qualifierDecls);
+    EXPECT_EQ(1u, report.classes);
+    EXPECT_EQ(1u, report.instances);
+    EXPECT_EQ("", TMofLoading::Tolerated(report));
+}
+
+TEST(MofIncludeTest, AliasesAreKnownInAllFilesOfADocument)
+{
+    TMofLoading loading;
+    loading.File("disk.mof", "instance of Disk as $A { Id = \"a\"; };");
+    loading.Load("class Disk { [Key] string Id; Disk REF Next; };\ninstance of Disk { Id = \"b\"; Next = $A; };" +
+                 Include("disk.mof"));
+    EXPECT_EQ("Disk.Id=\"a\"", loading.ValueOf("Disk.Id=\"b\"", "Next"));
+}
+
+TEST(MofIncludeTest, MistakesAreReportedInTheFileThatHasThem)
+{
+    TMofLoading loading;
+    loading.File("bad.mof", "\n oops").File("late.mof", "\nclass B : Missing { };").File("good.mof", "class C { };");
+    EXPECT_EQ("bad.mof:2:2: found \"oops\", expected a class, an instance, a qualifier or #pragma",
+              loading.ErrorOf("class A { };" + Include("bad.mof")));
+    EXPECT_EQ("late.mof:2:1: found class \"B\" with the superclass \"Missing\", which is not declared; add its <CLASS> to the "
+              "document or load it before",
+              loading.ErrorOf(Include("late.mof") + "class A { };"));
+    EXPECT_EQ("doc.mof:2:1: found \"oops\", expected a class, an instance, a qualifier or #pragma",
+              loading.ErrorOf(Include("good.mof") + "oops"));
+    EXPECT_EQ("late.mof:2:1: found class \"B\" with the superclass \"Missing\", which is not declared; add its <CLASS> to the "
+              "document or load it before",
+              loading.File("late.mof", "\nclass B : Missing { [Undeclared] string Id; };").ErrorOf(Include("late.mof")));
+}
+
+TEST(MofIncludeTest, ACircleIsAnError)
+{
+    TMofLoading loading;
+    loading.File("a.mof", Include("b.mof")).File("b.mof", "\n" + Include("a.mof")).File("self.mof", Include("self.mof"));
+    EXPECT_EQ("b.mof:2:25: found an include of \"a.mof\", which includes this document; remove one of the two",
+              loading.ErrorOf(Include("a.mof")));
+    EXPECT_EQ("self.mof:1:28: found an include of \"self.mof\", which includes this document; remove one of the two",
+              loading.ErrorOf(Include("self.mof")));
+}
+
+TEST(MofIncludeTest, IncludesAreBounded)
+{
+    TMofLoading loading;
+    for (int number = 0; number < 40; ++number) {
+        loading.File(std::to_string(number), Include(std::to_string(number + 1)));
+    }
+    loading.File("40", "");
+    EXPECT_EQ("", loading.ErrorOf(Include("9")));
+    EXPECT_EQ("32:1:22: found an include of \"33\", which is one too many or too deep; join some of the files",
+              loading.ErrorOf(Include("0")));
+}
+
+/// Folders and files on disk, removed with this object:
+///
+///     given/main.mof  given/sub/part.mof  given/link.mof -> sub/part.mof  given/out.mof -> ../secret.mof  given/away -> ..
+///     second/more.mof  secret.mof
+class MofFoldersTest : public testing::Test {
+  protected:
+    MofFoldersTest() : fRoot(testing::TempDir() + "cimdelta-folders-XXXXXX"), fFolders(boost::make_shared<TMofFolders>())
+    {
+        EXPECT_NE(nullptr, mkdtemp(fRoot.data()));
+        fRoot += '/';
+        for (const char* folder : {"given/sub", "second"}) {
+            std::filesystem::create_directories(fRoot + folder);
+        }
+        Write("given/sub/part.mof", "class Part { };");
+        Write("second/more.mof", "class More { };");
+        Write("secret.mof", "class Secret { };");
+        std::filesystem::create_symlink("sub/part.mof", fRoot + "given/link.mof");
+        std::filesystem::create_symlink("../secret.mof", fRoot + "given/out.mof");
+        std::filesystem::create_symlink("..", fRoot + "given/away");
+        fFolders->Add(fRoot + "given");
+        fFolders->Add(fRoot + "second/");
+        fFolders->Add(fRoot + "missing");
+    }
+    ~MofFoldersTest() override { std::filesystem::remove_all(fRoot); }
+
+    void Write(const std::string& name, const std::string& text) const { std::ofstream(fRoot + name) << text; }
+
+    /// Loads given/main.mof, which includes the name: "" or the message without the folder.
+    std::string ErrorOfInclude(const std::string& name)
+    {
+        Write("given/main.mof", Include(name));
+        try {
+            TMofPopulator(TInMemNamespace::Create("root/cimv2"), fFolders).LoadFile(fRoot + "given/main.mof");
+            return std::string();
+        } catch (const TPopulateError& error) {
+            return error.GetMessage();
+        }
+    }
+
+    std::string fRoot;
+    boost::shared_ptr<TMofFolders> fFolders;
+};
+
+TEST_F(MofFoldersTest, FilesOfTheGivenFoldersMayBeIncluded)
+{
+    for (const char* name : {"sub/part.mof", "sub\\\\part.mof", "./sub/../sub/part.mof", "more.mof", "link.mof"}) {
+        EXPECT_EQ("", ErrorOfInclude(name)) << name;
+    }
+}
+
+TEST_F(MofFoldersTest, NothingElseMayBeIncluded)
+{
+    const std::string outside =
+        "which is outside of the folders given for included files; put it into one of them, or give its folder";
+    const std::string nowhere = "which is not in the folders given for included files; give the folder that it is in";
+    const struct {
+        std::string name;
+        std::string reason;
+    } kRows[] = {
+        {"../secret.mof", outside},
+        {"sub/../../secret.mof", outside},
+        {"away/secret.mof", outside},
+        {"out.mof", outside},
+        {fRoot + "given/sub/part.mof", outside},
+        {"/etc/hostname", outside},
+        {"", outside},
+        {"none.mof", nowhere},
+        {"sub/none/../part.mof", nowhere},
+        {"sub", "which is no file"},
+    };
+    for (const auto& row : kRows) {
+        EXPECT_EQ("found an include of \"" + row.name + "\", " + row.reason, ErrorOfInclude(row.name));
+    }
+}
+
+TEST_F(MofFoldersTest, AFileThatHasTooManyBytesIsRefused)
+{
+    IMofIncludes::TFile file;
+    std::string reason;
+    std::string bytes;
+    ASSERT_TRUE(fFolders->Find("part.mof", fRoot + "given/sub/x.mof", file, reason));
+    EXPECT_TRUE(fFolders->Read(file, 15, bytes, reason));
+    EXPECT_EQ("class Part { };", bytes);
+    EXPECT_FALSE(fFolders->Read(file, 14, bytes, reason));
+    EXPECT_EQ("which has more than 14 bytes; split it", reason);
+}
+
+TEST_F(MofFoldersTest, ALinkThatReplacesAFileIsNotFollowed)
+{
+    IMofIncludes::TFile file;
+    std::string reason;
+    std::string bytes;
+    ASSERT_TRUE(fFolders->Find("sub/part.mof", fRoot + "given/main.mof", file, reason));
+    std::filesystem::remove(fRoot + "given/sub/part.mof");
+    std::filesystem::create_symlink("../../secret.mof", fRoot + "given/sub/part.mof");
+    EXPECT_FALSE(fFolders->Read(file, 1000, bytes, reason));
+    EXPECT_EQ(0u, reason.find("which cannot be opened: ")) << reason;
+}
+
+TEST_F(MofFoldersTest, TheFileItselfIsReadFromAnyPlace)
+{
+    EXPECT_EQ(1u, TMofPopulator(TInMemNamespace::Create("root/cimv2")).LoadFile(fRoot + "secret.mof").classes);
+    try {
+        TMofPopulator(TInMemNamespace::Create("root/cimv2")).LoadFile(fRoot + "none.mof");
+        FAIL();
+    } catch (const TPopulateError& error) {
+        EXPECT_EQ(fRoot + "none.mof: cannot open the file: No such file or directory", error.what());
+        EXPECT_EQ(TZELStatusCode::kFileError, error.GetStatusCode().GetStatus());
+    }
+}
+
+}  // namespace
+}  // namespace NORVZEL20
