@@ -7,6 +7,7 @@
 
 #include <algorithm>
 #include <iterator>
+#include <utility>
 #include <vector>
 
 #include "embedded/load/MessageText.h"
@@ -38,14 +39,30 @@ bool ReadCharacterCode(const std::string& text, TCIMValue& result)
     return true;
 }
 
+/// A host says nothing without a namespace, so it is dropped, as in CIM-XML.
+bool ReadReference(const std::string& text, TCIMValue& result)
+{
+    TCIMValue value;
+    if (!TValueText::Convert(TCIMValue(text), TType::kReference, value)) {
+        return false;
+    }
+    TCIMReference path = value;
+    if (path.GetNamespaceName().empty() && !path.GetHost().empty()) {
+        path.SetHost("");
+        value = TCIMValue(path);
+    }
+    result = std::move(value);
+    return true;
+}
+
 bool ReadText(const std::string& text, TType type, TCIMValue& result)
 {
     if (type == TType::kString) {
         result = TCIMValue(text);
         return true;
     }
-    return (type == TType::kDateTime && TValueText::Parse(type, text, result)) ||
-           (type == TType::kReference && TValueText::Convert(TCIMValue(text), type, result));
+    return type == TType::kReference ? ReadReference(text, result)
+                                     : type == TType::kDateTime && TValueText::Parse(type, text, result);
 }
 
 /// A value that is no array, in a type that is none.
