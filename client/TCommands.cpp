@@ -14,7 +14,9 @@ namespace NORVZEL20 {
 
 namespace {
 
-const char kInventoryHelp[] = "CIM-XML, plain or compressed with gzip, xz or zstd; - is standard input";
+const char kInventoryHelp[] = "[LABEL=]SOURCE[,SOURCE...]; a source is a file of CIM-XML, plain or compressed with gzip, xz or "
+                              "zstd, a folder of such files, or - "
+                              "for standard input";
 
 void AddVersion(CLI::App& app)
 {
@@ -97,14 +99,13 @@ void TCommands::AddCompare()
 {
     CLI::App* command =
         AddCommand("compare", "show what differs between a reference and other inventories", [this](IConsole& console) {
-            std::vector<std::string> paths = fCompare.others;
-            paths.insert(paths.begin(), fCompare.reference);
-            paths = PrepareFiles({paths, fCompare.rules, fCompare.output}, 2, console);
-            fCompare.others.assign(paths.begin() + 1, paths.end());
+            std::vector<std::string> inventories = fOthers;
+            inventories.insert(inventories.begin(), fReference);
+            fCompare.inventories = PrepareFiles({inventories, fCompare.rules, fCompare.output}, 2, console);
             return RunCompare(fCompare, console);
         });
-    AddText(command, "REFERENCE", fCompare.reference, kInventoryHelp)->required()->option_text(" ");
-    AddText(command, "OTHER", fCompare.others, "the inventories to compare with the reference")->required()->option_text("...");
+    AddText(command, "REFERENCE", fReference, kInventoryHelp)->required()->option_text(" ");
+    AddText(command, "OTHER", fOthers, "the inventories to compare with the reference")->required()->option_text("...");
     AddText(command, "--spec", fCompare.rules,
             "a rules file that says what to compare, or - for standard input (default: everything)")
         ->option_text("RULES");
@@ -119,11 +120,11 @@ void TCommands::AddCheck()
 {
     CLI::App* command = AddCommand("check", "show what a rules file says, what follows from it and what may be a mistake",
                                    [this](IConsole& console) {
-                                       fCheck.schemas = PrepareFiles({fCheck.schemas, fCheck.rules, fCheck.output}, 1, console);
+                                       fCheck.schemas = PrepareFiles({fOthers, fCheck.rules, fCheck.output}, 1, console);
                                        return RunCheck(fCheck, console);
                                    });
     AddText(command, "RULES", fCheck.rules, "the rules file, or - for standard input")->required()->option_text(" ");
-    AddSchemas(command, fCheck.schemas);
+    AddSchemas(command, fOthers);
     AddStrictSchema(command, fCheck.strictSchema);
     AddLoadingOptions(command, fCheck.loading);
     AddOutput(command, fCheck.output);
@@ -133,13 +134,13 @@ void TCommands::AddExplain()
 {
     CLI::App* command =
         AddCommand("explain", "show which rule decides how a class or a property is compared", [this](IConsole& console) {
-            fExplain.schemas = PrepareFiles({fExplain.schemas, fExplain.rules, fExplain.output}, 1, console);
+            fExplain.schemas = PrepareFiles({fOthers, fExplain.rules, fExplain.output}, 1, console);
             return RunExplain(fExplain, console);
         });
     AddText(command, "ELEMENT", fExplain.element, "CLASS or CLASS.PROPERTY")->required()->option_text(" ");
     AddText(command, "--spec", fExplain.rules, "a rules file, or - for standard input (default: everything is compared)")
         ->option_text("RULES");
-    AddSchemas(command, fExplain.schemas)->required();
+    AddSchemas(command, fOthers)->required();
     AddStrictSchema(command, fExplain.strictSchema);
     AddLoadingOptions(command, fExplain.loading);
     AddOutput(command, fExplain.output);
@@ -148,11 +149,11 @@ void TCommands::AddExplain()
 void TCommands::AddQuery()
 {
     CLI::App* command = AddCommand("query", "show the instances of an inventory that match a query", [this](IConsole& console) {
-        PrepareFiles({{fQuery.inventory}, std::string(), fQuery.output}, 1, console);
+        fQuery.inventory = PrepareFiles({{fReference}, std::string(), fQuery.output}, 1, console).front();
         return RunQuery(fQuery, console);
     });
     AddText(command, "QUERY", fQuery.query, "WQL: SELECT * | name, ... FROM class [WHERE ...]")->required()->option_text(" ");
-    AddText(command, "INVENTORY", fQuery.inventory, kInventoryHelp)->required()->option_text(" ");
+    AddText(command, "INVENTORY", fReference, kInventoryHelp)->required()->option_text(" ");
     AddFormat(command, fQuery.format);
     AddLoadingOptions(command, fQuery.loading);
     AddOutput(command, fQuery.output);
@@ -162,10 +163,10 @@ void TCommands::AddShow()
 {
     CLI::App* command =
         AddCommand("show", "show the classes of an inventory, or the instances of a class", [this](IConsole& console) {
-            PrepareFiles({{fShow.inventory}, std::string(), fShow.output}, 1, console);
+            fShow.inventory = PrepareFiles({{fReference}, std::string(), fShow.output}, 1, console).front();
             return RunShow(fShow, console);
         });
-    AddText(command, "INVENTORY", fShow.inventory, kInventoryHelp)->required()->option_text(" ");
+    AddText(command, "INVENTORY", fReference, kInventoryHelp)->required()->option_text(" ");
     AddText(command, "CLASS", fShow.className, "show the instances of this class and of the classes below it")->option_text(" ");
     AddFormat(command, fShow.format);
     AddLoadingOptions(command, fShow.loading);

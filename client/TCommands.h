@@ -35,6 +35,8 @@ class TCommands {
 
     CLI::App& fApp;
     std::function<int(IConsole&)> fChosen;
+    std::string fReference;            // as typed
+    std::vector<std::string> fOthers;  // likewise: the other inventories of compare, and those of the other commands
     TCompareOptions fCompare;
     TCheckOptions fCheck;
     TExplainOptions fExplain;

@@ -11,7 +11,7 @@ namespace NORVZEL20 {
 
 int RunCheck(const TCheckOptions& options, IConsole& console)
 {
-    const std::optional<TRulesText> rules = ReadRulesFor(options.schemas, options.rules);
+    const std::optional<TRulesText> rules = ReadRulesIfAny(options.rules);
     std::vector<TInventory> inventories = TInventoryLoader(console, options.loading).Load(options.schemas);
     std::vector<TSchemaNote> notes;
     if (!options.strictSchema && !inventories.empty()) {

@@ -3,6 +3,7 @@
 #include <string>
 #include <vector>
 
+#include "client/inventory/TInventorySources.h"
 #include "client/inventory/TLoadingOptions.h"
 #include "client/process/IConsole.h"
 
@@ -11,9 +12,9 @@ namespace NORVZEL20 {
 /// The arguments of `cimdelta check`.
 struct TCheckOptions {
     std::string rules;
-    std::vector<std::string> schemas;  ///< inventories, the reference first; none: only what needs no inventory is checked
-    std::string output;                ///< empty: standard output
-    bool strictSchema = false;         ///< whether the inventories are left as they are
+    std::vector<TInventorySources> schemas;  ///< inventories, the reference first; none: only what needs no inventory is checked
+    std::string output;                      ///< empty: standard output
+    bool strictSchema = false;               ///< whether the inventories are left as they are
     TLoadingOptions loading;
 };
 

@@ -29,14 +29,12 @@ void Deliver(const TComparisonReport& report, const TCompareOptions& options, IC
 
 int RunCompare(const TCompareOptions& options, IConsole& console)
 {
-    std::vector<std::string> paths(1, options.reference);
-    paths.insert(paths.end(), options.others.begin(), options.others.end());
     // Before the inventories, which may take long to load.
-    const std::optional<TRulesText> rules = ReadRulesFor(paths, options.rules);
-    std::vector<TInventory> inventories = TInventoryLoader(console, options.loading).Load(paths);
+    const std::optional<TRulesText> rules = ReadRulesIfAny(options.rules);
+    std::vector<TInventory> inventories = TInventoryLoader(console, options.loading).Load(options.inventories);
     const TComparisonReport report = TComparison(inventories, console).Run(rules, options.strictSchema);
     if (!options.allowEmpty && report.coverage.IsNothingCompared()) {
-        throw TClientError(DescribeNothingCompared(report, options.rules, options.strictSchema));
+        throw TClientError(DescribeNothingCompared(report, inventories, options.rules, options.strictSchema));
     }
     Deliver(report, options, console);
     return report.differences->GetCounts().GetTotal() == 0 ? kExitSuccess : kExitDifferences;

@@ -3,6 +3,7 @@
 #include <string>
 #include <vector>
 
+#include "client/inventory/TInventorySources.h"
 #include "client/inventory/TLoadingOptions.h"
 #include "client/process/IConsole.h"
 #include "client/report/EOutputFormat.h"
@@ -11,9 +12,8 @@ namespace NORVZEL20 {
 
 /// The arguments of `cimdelta compare`.
 struct TCompareOptions {
-    std::string reference;
-    std::vector<std::string> others;  ///< at least one
-    std::string rules;                ///< empty: everything is compared
+    std::vector<TInventorySources> inventories;  ///< at least two, the reference first
+    std::string rules;                           ///< empty: everything is compared
     EOutputFormat format = EOutputFormat::kText;
     std::string output;  ///< empty: standard output
     bool strictSchema = false;

@@ -36,7 +36,7 @@ TAskedElement Split(const std::string& text)
 int RunExplain(const TExplainOptions& options, IConsole& console)
 {
     const TAskedElement element = Split(options.element);
-    const std::optional<TRulesText> rules = ReadRulesFor(options.schemas, options.rules);
+    const std::optional<TRulesText> rules = ReadRulesIfAny(options.rules);
     std::vector<TInventory> inventories = TInventoryLoader(console, options.loading).Load(options.schemas);
     std::vector<TSchemaNote> notes;
     if (!options.strictSchema) {

@@ -3,6 +3,7 @@
 #include <string>
 #include <vector>
 
+#include "client/inventory/TInventorySources.h"
 #include "client/inventory/TLoadingOptions.h"
 #include "client/process/IConsole.h"
 
@@ -10,11 +11,11 @@ namespace NORVZEL20 {
 
 /// The arguments of `cimdelta explain`.
 struct TExplainOptions {
-    std::string element;               ///< a class, or a class and a property with a dot between them
-    std::string rules;                 ///< empty: everything is compared
-    std::vector<std::string> schemas;  ///< inventories, the reference first; at least one
-    std::string output;                ///< empty: standard output
-    bool strictSchema = false;         ///< whether the inventories are left as they are
+    std::string element;                     ///< a class, or a class and a property with a dot between them
+    std::string rules;                       ///< empty: everything is compared
+    std::vector<TInventorySources> schemas;  ///< inventories, the reference first; at least one
+    std::string output;                      ///< empty: standard output
+    bool strictSchema = false;               ///< whether the inventories are left as they are
     TLoadingOptions loading;
 };
 

@@ -2,19 +2,28 @@
 
 #include "client/inventory/CheckInventoryFiles.h"
 #include "client/inventory/DropRepeatedFiles.h"
+#include "client/inventory/ReadInventoryArgument.h"
 #include "client/report/TResultOutput.h"
 
 namespace NORVZEL20 {
 
-std::vector<std::string> PrepareFiles(const TCommandFiles& files, std::size_t fewest, IConsole& console)
+std::vector<TInventorySources> PrepareFiles(const TCommandFiles& files, std::size_t fewest, IConsole& console)
 {
-    std::vector<std::string> inputs = files.inventories;
+    std::vector<TInventorySources> inventories;
+    std::vector<std::string> inputs;
+    for (const std::string& argument : files.inventories) {
+        inventories.push_back(ReadInventoryArgument(argument, console));
+        inputs.insert(inputs.end(), inventories.back().files.begin(), inventories.back().files.end());
+    }
+    const std::vector<std::string> toLoad = inputs;
     if (!files.rules.empty()) {
         inputs.push_back(files.rules);
     }
     CheckOutput(files.output, inputs);
-    CheckInventoryFiles(files.inventories);
-    return DropRepeatedFiles(files.inventories, fewest, console);
+    CheckInventoryFiles(toLoad);
+    inventories = DropRepeatedInventories(std::move(inventories), fewest, console);
+    RequireReadableOnce(inventories, files.rules);
+    return inventories;
 }
 
 }  // namespace NORVZEL20

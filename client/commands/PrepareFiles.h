@@ -3,21 +3,23 @@
 #include <string>
 #include <vector>
 
+#include "client/inventory/TInventorySources.h"
 #include "client/process/IConsole.h"
 
 namespace NORVZEL20 {
 
 /// The files that a command line names.
 struct TCommandFiles {
-    std::vector<std::string> inventories;
-    std::string rules;   ///< empty: none
-    std::string output;  ///< empty: standard output
+    std::vector<std::string> inventories;  ///< arguments, see ReadInventoryArgument
+    std::string rules;                     ///< empty: none
+    std::string output;                    ///< empty: standard output
 };
 
 /// Checks the files before a command reads the first of them, so that nobody waits for large inventories to learn of a misspelt
-/// name. Returns the inventories without those that are the same file as an earlier one, each of which gets a note on the console.
-/// Errors: TClientError if an inventory cannot be read, if the output cannot be written or is itself one of the files that are
-/// read, or if fewer than `fewest` inventories remain. What the rules say is not checked here.
-std::vector<std::string> PrepareFiles(const TCommandFiles& files, std::size_t fewest, IConsole& console);
+/// name. Returns the inventories, see DropRepeatedInventories.
+/// Errors: TClientError if an argument cannot be understood, if an inventory cannot be read, if the output cannot be written or is
+/// itself one of the files that are read, if something is to be read twice that can be read only once, or if fewer than `fewest`
+/// inventories remain. What the rules say is not checked here.
+std::vector<TInventorySources> PrepareFiles(const TCommandFiles& files, std::size_t fewest, IConsole& console);
 
 }  // namespace NORVZEL20

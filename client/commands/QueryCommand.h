@@ -2,6 +2,7 @@
 
 #include <string>
 
+#include "client/inventory/TInventorySources.h"
 #include "client/inventory/TLoadingOptions.h"
 #include "client/process/IConsole.h"
 #include "client/report/EOutputFormat.h"
@@ -11,7 +12,7 @@ namespace NORVZEL20 {
 /// The arguments of `cimdelta query`.
 struct TQueryOptions {
     std::string query;
-    std::string inventory;
+    TInventorySources inventory;
     EOutputFormat format = EOutputFormat::kText;
     std::string output;  ///< empty: standard output
     TLoadingOptions loading;

@@ -2,6 +2,7 @@
 
 #include <string>
 
+#include "client/inventory/TInventorySources.h"
 #include "client/inventory/TLoadingOptions.h"
 #include "client/process/IConsole.h"
 #include "client/report/EOutputFormat.h"
@@ -10,7 +11,7 @@ namespace NORVZEL20 {
 
 /// The arguments of `cimdelta show`.
 struct TShowOptions {
-    std::string inventory;
+    TInventorySources inventory;
     std::string className;  ///< empty: the classes are listed
     EOutputFormat format = EOutputFormat::kText;
     std::string output;  ///< empty: standard output

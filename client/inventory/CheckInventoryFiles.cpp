@@ -2,6 +2,8 @@
 
 #include <sys/stat.h>
 
+#include <set>
+
 #include "client/files/TInputFile.h"
 #include "client/inventory/TInventoryFile.h"
 #include "client/process/TClientError.h"
@@ -11,14 +13,20 @@ namespace NORVZEL20 {
 
 namespace {
 
+// Whether a path leads to a pipe or a device.
+bool IsStream(const std::string& path)
+{
+    struct stat status;
+    return stat(path.c_str(), &status) == 0 && !S_ISREG(status.st_mode) && !S_ISDIR(status.st_mode);
+}
+
 void CheckFile(const std::string& path)
 {
     if (path == "-") {
         const TInputFile file(path);
         return;
     }
-    struct stat status;
-    if (stat(path.c_str(), &status) == 0 && !S_ISREG(status.st_mode) && !S_ISDIR(status.st_mode)) {
+    if (IsStream(path)) {
         // Opening a pipe may wait for a writer, and closing it ends the writer.
         return;
     }
@@ -45,6 +53,21 @@ void CheckInventoryFiles(const std::vector<std::string>& paths)
     if (!message.empty()) {
         throw TClientError(
             others.empty() ? message : message + "; " + std::to_string(others.size()) + " more cannot be read: " + SomeOf(others));
+    }
+}
+
+void RequireReadableOnce(const std::vector<TInventorySources>& inventories, const std::string& rules)
+{
+    std::vector<std::string> paths(1, rules);
+    for (const TInventorySources& sources : inventories) {
+        paths.insert(paths.end(), sources.files.begin(), sources.files.end());
+    }
+    RequireOneStandardInput(paths);
+    std::set<std::string> streams;
+    for (const std::string& path : paths) {
+        if (IsStream(path) && path != "/dev/null" && !streams.insert(path).second) {
+            throw TClientError(path + ": is a pipe or a device, which can be read only once; save it to a file first");
+        }
     }
 }
 

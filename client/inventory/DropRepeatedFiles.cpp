@@ -11,48 +11,110 @@ namespace NORVZEL20 {
 namespace {
 
 struct TKept {
-    std::string path;
-    std::optional<TFileIdentity> identity;
+    std::string name;  // what notes call it
+    std::vector<std::string> paths;
+    std::vector<std::optional<TFileIdentity>> identities;
 };
 
-bool IsSame(const TKept& a, const TKept& b)
+TKept Identify(const std::string& name, const std::vector<std::string>& paths)
 {
-    if (a.path == "-" && b.path == "-") {
-        return false;
+    TKept kept = {name, paths, {}};
+    for (const std::string& path : paths) {
+        kept.identities.push_back(IdentifyFile(path));
     }
-    return a.path == b.path || (a.identity && b.identity && *a.identity == *b.identity);
+    return kept;
 }
 
-std::string Note(const std::string& path, const std::string& earlier)
+bool IsSameFile(const TKept& a, std::size_t i, const TKept& b, std::size_t j)
 {
-    return "cimdelta: " + path + ": " + (path == earlier ? "is named more than once" : "is the same file as " + earlier) +
+    if (a.paths[i] == "-" && b.paths[j] == "-") {
+        return false;
+    }
+    return a.paths[i] == b.paths[j] || (a.identities[i] && b.identities[j] && *a.identities[i] == *b.identities[j]);
+}
+
+// Whether both consist of the same files, in any order. Neither has a file twice.
+bool IsSame(const TKept& a, const TKept& b)
+{
+    if (a.paths.size() != b.paths.size()) {
+        return false;
+    }
+    for (std::size_t i = 0; i < a.paths.size(); ++i) {
+        bool isFound = false;
+        for (std::size_t j = 0; j < b.paths.size() && !isFound; ++j) {
+            isFound = IsSameFile(a, i, b, j);
+        }
+        if (!isFound) {
+            return false;
+        }
+    }
+    return true;
+}
+
+std::string Note(const TKept& file, const TKept& earlier)
+{
+    const std::string same = file.paths.size() == 1 ? "is the same file as " : "consists of the same files as ";
+    return "cimdelta: " + file.name + ": " + (file.name == earlier.name ? "is named more than once" : same + earlier.name) +
            "; it is used once";
+}
+
+// Those that are kept, in order; `notes` gets one for each name that is dropped.
+std::vector<std::size_t> FindDifferent(const std::vector<TKept>& all, std::map<std::string, std::string>& notes)
+{
+    std::vector<std::size_t> kept;
+    for (std::size_t i = 0; i < all.size(); ++i) {
+        const auto earlier = std::find_if(kept.begin(), kept.end(), [&](std::size_t other) { return IsSame(all[i], all[other]); });
+        if (earlier == kept.end()) {
+            kept.push_back(i);
+        } else {
+            notes.emplace(all[i].name, Note(all[i], all[*earlier]));
+        }
+    }
+    return kept;
+}
+
+void SayAll(const std::map<std::string, std::string>& notes, IConsole& console)
+{
+    for (const auto& note : notes) {
+        console.Say(note.second);
+    }
 }
 
 }  // namespace
 
-std::vector<std::string> DropRepeatedFiles(const std::vector<std::string>& paths, std::size_t fewest, IConsole& console)
+std::vector<std::string> DropRepeatedFiles(const std::vector<std::string>& paths, IConsole& console)
 {
-    std::vector<TKept> kept;
-    std::map<std::string, std::string> notes;  // by the path that is dropped
+    std::vector<TKept> files;
     for (const std::string& path : paths) {
-        const TKept file = {path, IdentifyFile(path)};
-        const auto earlier = std::find_if(kept.begin(), kept.end(), [&](const TKept& other) { return IsSame(file, other); });
-        if (earlier == kept.end()) {
-            kept.push_back(file);
-        } else {
-            notes.emplace(path, Note(path, earlier->path));
-        }
+        files.push_back(Identify(path, {path}));
     }
-    if (kept.size() < std::min(fewest, paths.size())) {
-        throw TClientError("all inventories are the same file, " + paths.front() + "; name another one to compare it with");
-    }
-    for (const auto& note : notes) {
-        console.Say(note.second);
-    }
+    std::map<std::string, std::string> notes;
     std::vector<std::string> different;
-    for (const TKept& file : kept) {
-        different.push_back(file.path);
+    for (const std::size_t i : FindDifferent(files, notes)) {
+        different.push_back(paths[i]);
+    }
+    SayAll(notes, console);
+    return different;
+}
+
+std::vector<TInventorySources> DropRepeatedInventories(std::vector<TInventorySources> inventories, std::size_t fewest,
+                                                       IConsole& console)
+{
+    std::vector<TKept> all;
+    for (TInventorySources& sources : inventories) {
+        sources.files = DropRepeatedFiles(sources.files, console);
+        all.push_back(Identify(sources.argument, sources.files));
+    }
+    std::map<std::string, std::string> notes;
+    const std::vector<std::size_t> kept = FindDifferent(all, notes);
+    if (kept.size() < std::min(fewest, inventories.size())) {
+        throw TClientError("all inventories are the same " + std::string(all.front().paths.size() == 1 ? "file, " : "files, ") +
+                           inventories.front().argument + "; name another one to compare it with");
+    }
+    SayAll(notes, console);
+    std::vector<TInventorySources> different;
+    for (const std::size_t i : kept) {
+        different.push_back(std::move(inventories[i]));
     }
     return different;
 }

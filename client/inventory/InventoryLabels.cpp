@@ -4,6 +4,7 @@
 #include <set>
 #include <string_view>
 
+#include "client/process/TClientError.h"
 #include "client/text/DisplayText.h"
 
 namespace NORVZEL20 {
@@ -34,7 +35,9 @@ std::string ShortName(const std::string& path)
     if (path == "-") {
         return "stdin";
     }
-    std::string name = path.substr(path.rfind('/') + 1);
+    const std::size_t end = path.find_last_not_of('/');  // slashes behind the name of a folder do not count
+    const std::string trimmed = path.substr(0, end == std::string::npos ? path.size() : end + 1);
+    std::string name = trimmed.substr(trimmed.rfind('/') + 1);
     // The suffix of the compression comes last in the name, so it is taken off first.
     TakeOffOneOf(name, {".gz", ".xz", ".zst"});
     TakeOffOneOf(name, {".xml", ".cimxml", ".cim"});
@@ -50,26 +53,40 @@ std::map<std::string, int> CountOf(const std::vector<std::string>& names)
     return count;
 }
 
+// The labels that were given; they stay as they are.
+std::set<std::string> CollectGiven(const std::vector<TInventorySources>& inventories)
+{
+    std::set<std::string> given;
+    for (const TInventorySources& sources : inventories) {
+        const std::string label = EscapeForDisplay(sources.label);
+        if (!label.empty() && !given.insert(label).second) {
+            throw TClientError("two inventories have the label " + label + "; give them different ones");
+        }
+    }
+    return given;
+}
+
 }  // namespace
 
-std::vector<std::string> MakeInventoryLabels(const std::vector<std::string>& paths)
+std::vector<std::string> MakeInventoryLabels(const std::vector<TInventorySources>& inventories)
 {
+    std::set<std::string> taken = CollectGiven(inventories);
     std::vector<std::string> labels;
-    for (const std::string& path : paths) {
-        labels.push_back(EscapeForDisplay(ShortName(path)));
+    for (const TInventorySources& sources : inventories) {
+        labels.push_back(EscapeForDisplay(sources.label.empty() ? ShortName(sources.firstSource) : sources.label));
     }
     const std::map<std::string, int> count = CountOf(labels);
     for (std::size_t i = 0; i < labels.size(); ++i) {
-        if (count.at(labels[i]) > 1) {
-            labels[i] = EscapeForDisplay(paths[i]);
+        if (!inventories[i].label.empty()) {
+            continue;
         }
-    }
-    // A file may itself be called "a#2", so a number is skipped if its label is taken.
-    std::set<std::string> taken;
-    for (std::string& label : labels) {
-        const std::string plain = label;
-        for (int number = 2; !taken.insert(label).second; ++number) {
-            label = plain + "#" + std::to_string(number);
+        if (count.at(labels[i]) > 1) {
+            labels[i] = EscapeForDisplay(inventories[i].firstSource);
+        }
+        // A file may itself be called "a#2", so a number is skipped if its label is taken.
+        const std::string plain = labels[i];
+        for (int number = 2; !taken.insert(labels[i]).second; ++number) {
+            labels[i] = plain + "#" + std::to_string(number);
         }
     }
     return labels;

@@ -12,7 +12,7 @@ boost::shared_ptr<TInMemClass> RequireClass(const TInventory& inventory, const s
     const boost::shared_ptr<TInMemClass> cls = inventory.ns->FindClass(name);
     if (!cls) {
         throw TClientError(NameOfInput(inventory.path) + ": declares no class " + EscapeForDisplay(name) +
-                           TSuggestedCommand("show").AddFile(inventory.path).Advise("lists those it declares"));
+                           TSuggestedCommand("show").AddInventory(inventory).Advise("lists those it declares"));
     }
     return cls;
 }

@@ -16,12 +16,14 @@
 
 #include "client/files/TInputFile.h"
 #include "client/inventory/InventoryLabels.h"
-#include "client/inventory/TInventoryFile.h"
+#include "client/inventory/MakeLoadOptions.h"
+#include "client/inventory/ReadSource.h"
 #include "client/process/LackOfMemory.h"
 #include "client/process/TClientError.h"
 #include "client/process/TProgress.h"
 #include "client/process/TSignalsHeld.h"
-#include "embedded/cimxml/TCimXmlDocuments.h"
+#include "embedded/load/TLoadSession.h"
+#include "embedded/load/TPopulateError.h"
 
 namespace NORVZEL20 {
 
@@ -31,37 +33,27 @@ const char kNamespaceName[] = "root/cimv2";
 const std::size_t kFewestAtOnce = 2;
 const std::size_t kMostAtOnce = 16;
 
-void LoadInto(TInventory& inventory, const TLoadingOptions& options)
+void LoadInto(TInventory& inventory, const TLoadOptions& options)
 {
-    TInventoryFile file(inventory.path);
+    const std::string name = NameOfInput(inventory.path);
     try {
-        TLoadSession session(inventory.ns, file.GetName(), options.load);
-        TCimXmlDocuments(session).ReadSource([&file](char* buffer, std::size_t size) { return file.Read(buffer, size); },
-                                             file.GetName());
+        TLoadSession session(inventory.ns, name, options);
+        for (const std::string& file : inventory.files) {
+            ReadSource(file, session);
+        }
         inventory.loaded = session.Commit();
     } catch (const TPopulateError& error) {
-        // The text may be malformed only because the compressed file is damaged.
-        file.CheckRest();
         throw TClientError(error.what());
     } catch (const TZELException& error) {
         ThrowIfOutOfMemory(error);
-        throw TClientError(file.GetName() + ": " + error.what());
+        throw TClientError(name + ": " + error.what());
     }
-}
-
-TInventory Prepare(const std::string& path, const std::string& label)
-{
-    TInventory inventory;
-    inventory.path = path;
-    inventory.label = label;
-    inventory.ns = TInMemNamespace::Create(kNamespaceName);
-    return inventory;
 }
 
 // Loads inventories on the calling thread and on helper threads.
 class TParallelLoad {
   public:
-    TParallelLoad(std::vector<TInventory>& inventories, const TLoadingOptions& options)
+    TParallelLoad(std::vector<TInventory>& inventories, const std::vector<TLoadOptions>& options)
         : fInventories(inventories), fOptions(options), fFaults(inventories.size()), fNext(CountAtOnce(inventories.size()))
     {}
 
@@ -116,31 +108,32 @@ class TParallelLoad {
     void TryLoad(std::size_t i) noexcept
     {
         try {
-            LoadInto(fInventories[i], fOptions);
+            LoadInto(fInventories[i], fOptions[i]);
         } catch (...) {
             fFaults[i] = std::current_exception();
         }
     }
 
     std::vector<TInventory>& fInventories;
-    const TLoadingOptions& fOptions;
-    std::vector<std::exception_ptr> fFaults;  // one for each inventory; null if it was loaded
-    std::atomic<std::size_t> fNext;           // the first inventory that no thread has taken
+    const std::vector<TLoadOptions>& fOptions;  // of each inventory
+    std::vector<std::exception_ptr> fFaults;    // one for each inventory; null if it was loaded
+    std::atomic<std::size_t> fNext;             // the first inventory that no thread has taken
 };
 
 }  // namespace
 
-std::vector<TInventory> TInventoryLoader::Load(const std::vector<std::string>& paths)
+std::vector<TInventory> TInventoryLoader::Load(const std::vector<TInventorySources>& sources)
 {
-    RequireOneStandardInput(paths);
-    const std::vector<std::string> labels = MakeInventoryLabels(paths);
+    const std::vector<std::string> labels = MakeInventoryLabels(sources);
+    const std::vector<TLoadOptions> options = MakeLoadOptions(fOptions, labels);
     std::vector<TInventory> inventories;
-    for (std::size_t i = 0; i < paths.size(); ++i) {
-        inventories.push_back(Prepare(paths[i], labels[i]));
+    for (std::size_t i = 0; i < sources.size(); ++i) {
+        inventories.push_back(
+            {sources[i].argument, sources[i].files, fOptions, labels[i], TInMemNamespace::Create(kNamespaceName), {}});
     }
     {
-        const TProgress progress(fConsole, paths.size() == 1 ? "loading the inventory" : "loading the inventories");
-        TParallelLoad(inventories, fOptions).Run();
+        const TProgress progress(fConsole, sources.size() == 1 ? "loading the inventory" : "loading the inventories");
+        TParallelLoad(inventories, options).Run();
     }
     for (const TInventory& inventory : inventories) {
         ReportTolerated(inventory);
@@ -148,16 +141,16 @@ std::vector<TInventory> TInventoryLoader::Load(const std::vector<std::string>& p
     return inventories;
 }
 
-TInventory TInventoryLoader::LoadOne(const std::string& path)
+TInventory TInventoryLoader::LoadOne(const TInventorySources& sources)
 {
-    return Load({path}).front();
+    return Load({sources}).front();
 }
 
 void TInventoryLoader::ReportTolerated(const TInventory& inventory)
 {
     for (const TLoadReport::TTolerated& tolerated : inventory.loaded.tolerated) {
         const std::string times = tolerated.count > 1 ? " (" + std::to_string(tolerated.count) + " times)" : "";
-        fConsole.Say("cimdelta: " + inventory.path + ":" + std::to_string(tolerated.line) + ": tolerated: " + tolerated.text +
+        fConsole.Say("cimdelta: " + tolerated.document + ":" + std::to_string(tolerated.line) + ": tolerated: " + tolerated.text +
                      times);
     }
 }

@@ -5,6 +5,7 @@
 #include <vector>
 
 #include "client/inventory/TInventory.h"
+#include "client/inventory/TInventorySources.h"
 #include "client/inventory/TLoadingOptions.h"
 #include "client/process/IConsole.h"
 
@@ -17,13 +18,14 @@ class TInventoryLoader {
     /// `console` must outlive this. It shows the progress, and a message for each fault that was tolerated in a file.
     explicit TInventoryLoader(IConsole& console, TLoadingOptions options = {}) : fConsole(console), fOptions(std::move(options)) {}
 
-    /// The inventories in the order of `paths`, of which one may be "-" for standard input.
+    /// The inventories in the order of `sources`, which name standard input at most once.
     /// Errors: TClientError that names file, line and column, as far as they are known. If several inventories cannot be loaded,
-    /// the error is that of the first of them in the order of `paths`.
-    std::vector<TInventory> Load(const std::vector<std::string>& paths);
+    /// the error is that of the first of them in the order of `sources`. Labels and options that do not fit together are refused
+    /// before anything is read.
+    std::vector<TInventory> Load(const std::vector<TInventorySources>& sources);
 
     /// The same for a single inventory.
-    TInventory LoadOne(const std::string& path);
+    TInventory LoadOne(const TInventorySources& sources);
 
   private:
     void ReportTolerated(const TInventory& inventory);

@@ -49,21 +49,34 @@ TSuggestedCommand& TSuggestedCommand::AddFile(const std::string& path)
     return Add(path);
 }
 
-TSuggestedCommand& TSuggestedCommand::AddSchemas(const std::vector<std::string>& paths, bool strictSchema)
+TSuggestedCommand& TSuggestedCommand::AddInventory(const TInventory& inventory)
 {
-    for (const std::string& path : paths) {
-        Add("--schema").AddFile(path);
-    }
-    return strictSchema ? Add("--strict-schema") : *this;
+    return AddArgument(inventory).AddLoading(inventory.loading);
 }
 
 TSuggestedCommand& TSuggestedCommand::AddSchemas(const std::vector<TInventory>& inventories, bool strictSchema)
 {
-    std::vector<std::string> paths;
     for (const TInventory& inventory : inventories) {
-        paths.push_back(inventory.path);
+        Add("--schema").AddArgument(inventory);
     }
-    return AddSchemas(paths, strictSchema);
+    if (!inventories.empty()) {
+        AddLoading(inventories.front().loading);
+    }
+    return strictSchema ? Add("--strict-schema") : *this;
+}
+
+TSuggestedCommand& TSuggestedCommand::AddArgument(const TInventory& inventory)
+{
+    fCanBeRun = fCanBeRun && std::all_of(inventory.files.begin(), inventory.files.end(), &CanBeReadAgain);
+    return Add(inventory.path);
+}
+
+TSuggestedCommand& TSuggestedCommand::AddLoading(const TLoadingOptions& options)
+{
+    for (const std::string& name : options.namespaces) {
+        Add("--namespace").Add(name);
+    }
+    return *this;
 }
 
 std::string TSuggestedCommand::Advise(const std::string& purpose) const

@@ -21,14 +21,20 @@ class TSuggestedCommand {
     /// cannot be printed: there is no command then.
     TSuggestedCommand& AddFile(const std::string& path);
 
-    /// Adds `--schema` for each path, the reference first, and `--strict-schema` if that is set.
-    TSuggestedCommand& AddSchemas(const std::vector<std::string>& paths, bool strictSchema);
+    /// Adds the argument of an inventory, whose files must be as above, and the options with which it was loaded.
+    TSuggestedCommand& AddInventory(const TInventory& inventory);
+
+    /// Adds `--schema` for each inventory, the reference first, the options with which they were loaded, and `--strict-schema` if
+    /// that is set.
     TSuggestedCommand& AddSchemas(const std::vector<TInventory>& inventories, bool strictSchema);
 
     /// "; ", the command, a blank and `purpose`, as the end of a message; empty if there is no command.
     std::string Advise(const std::string& purpose) const;
 
   private:
+    TSuggestedCommand& AddArgument(const TInventory& inventory);
+    TSuggestedCommand& AddLoading(const TLoadingOptions& options);
+
     std::string fText;
     bool fCanBeRun = true;
 };

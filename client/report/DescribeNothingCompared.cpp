@@ -65,7 +65,8 @@ std::vector<std::string> Reasons(const TComparisonReport& report)
 }
 
 // What shows the reason in full, or removes it; empty or with a semicolon in front.
-std::string Advice(const TComparisonReport& report, const std::string& rulesFile, bool strictSchema)
+std::string Advice(const TComparisonReport& report, const std::vector<TInventory>& inventories, const std::string& rulesFile,
+                   bool strictSchema)
 {
     const auto isAny = [&report](TCoverage::EState state) { return !ClassesIn(state, report.coverage).empty(); };
     if (rulesFile.empty()) {
@@ -75,13 +76,14 @@ std::string Advice(const TComparisonReport& report, const std::string& rulesFile
     }
     return TSuggestedCommand("check")
         .AddFile(rulesFile)
-        .AddSchemas(report.paths, strictSchema)
+        .AddSchemas(inventories, strictSchema)
         .Advise("shows what the rules compare");
 }
 
 }  // namespace
 
-std::string DescribeNothingCompared(const TComparisonReport& report, const std::string& rulesFile, bool strictSchema)
+std::string DescribeNothingCompared(const TComparisonReport& report, const std::vector<TInventory>& inventories,
+                                    const std::string& rulesFile, bool strictSchema)
 {
     std::vector<std::string> reasons = Reasons(report);
     const bool hasInstances = !reasons.empty();
@@ -89,7 +91,7 @@ std::string DescribeNothingCompared(const TComparisonReport& report, const std::
         reasons.push_back("no inventory has an instance");
     }
     return EscapeForDisplay("nothing was compared: " + boost::algorithm::join(reasons, "; ") +
-                            Advice(report, hasInstances ? rulesFile : std::string(), strictSchema) +
+                            Advice(report, inventories, hasInstances ? rulesFile : std::string(), strictSchema) +
                             ", or accept this with --allow-empty");
 }
 

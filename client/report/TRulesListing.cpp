@@ -256,7 +256,7 @@ boost::shared_ptr<TInMemClass> TRulesListing::RequireDeclared(const std::string&
         return RequireClass(fInventories.front(), className);
     }
     throw TClientError("no inventory declares a class " + EscapeForDisplay(className) +
-                       TSuggestedCommand("show").AddFile(fInventories.front().path).Advise("lists those of the first one"));
+                       TSuggestedCommand("show").AddInventory(fInventories.front()).Advise("lists those of the first one"));
 }
 
 // The plug-in lists an included property in the spelling of the rules, hence without regard to letter case.

@@ -71,11 +71,8 @@ TRulesText ReadRules(const std::string& path)
     return rules;
 }
 
-std::optional<TRulesText> ReadRulesFor(const std::vector<std::string>& inventories, const std::string& path)
+std::optional<TRulesText> ReadRulesIfAny(const std::string& path)
 {
-    std::vector<std::string> paths = inventories;
-    paths.push_back(path);
-    RequireOneStandardInput(paths);
     return path.empty() ? std::nullopt : std::make_optional(ReadRules(path));
 }
 

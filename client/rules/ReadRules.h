@@ -2,7 +2,6 @@
 
 #include <optional>
 #include <string>
-#include <vector>
 
 #include "client/rules/TRulesText.h"
 
@@ -13,8 +12,7 @@ namespace NORVZEL20 {
 /// Errors: TClientError that names the file, the line if there is one, what is wrong there and what can be done.
 TRulesText ReadRules(const std::string& path);
 
-/// The same for rules that are used with inventories; an empty path is none. Errors: also TClientError if standard input is named
-/// more than once.
-std::optional<TRulesText> ReadRulesFor(const std::vector<std::string>& inventories, const std::string& path);
+/// The same for rules that need not be there; an empty path is none.
+std::optional<TRulesText> ReadRulesIfAny(const std::string& path);
 
 }  // namespace NORVZEL20

@@ -39,9 +39,14 @@ void TLoadContext::EndDocument()
 void TLoadContext::Fail(TZELStatusCode::EStatusCode status, const std::string& message) const
 {
     const TLoadPlace place = GetPlace();
-    throw TPopulateError(status, fEmbeddedDepth > 0 ? "in an embedded object: " + message : message,
-                         place.document < fDocuments.size() ? fDocuments[place.document] : std::string(), place.place.line,
-                         place.place.column);
+    throw TPopulateError(status, fEmbeddedDepth > 0 ? "in an embedded object: " + message : message, NameOf(place),
+                         place.place.line, place.place.column);
+}
+
+/// Empty before the first document.
+std::string TLoadContext::NameOf(const TLoadPlace& place) const
+{
+    return place.document < fDocuments.size() ? fDocuments[place.document] : std::string();
 }
 
 void TLoadContext::EnterEmbeddedObject()
@@ -70,7 +75,8 @@ void TLoadContext::Tolerate(const char* kind, const std::string& text)
         return;
     }
     fKinds.push_back(kind);
-    fReport.tolerated.push_back({text, GetPlace().place.line, 1});
+    const TLoadPlace place = GetPlace();
+    fReport.tolerated.push_back({text, NameOf(place), place.place.line, 1});
 }
 
 void TLoadContext::NoteNamespace(const std::string& name, const std::string& host)

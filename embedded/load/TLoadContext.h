@@ -107,6 +107,8 @@ class CIMDELTA_INTERNAL_EXPORT TLoadContext {
     }
 
   private:
+    std::string NameOf(const TLoadPlace& place) const;
+
     struct TOpen {
         std::size_t number;  // of the document
         const IPlaceSource* reader;

@@ -10,9 +10,10 @@ namespace NORVZEL20 {
 struct TLoadReport {
     /// One kind of oddity that did not end the load.
     struct TTolerated {
-        std::string text;   ///< what was found and what was made of it, with the names of the first one
-        std::size_t line;   ///< the line of the first one, from 1
-        std::size_t count;  ///< how many of this kind there were
+        std::string text;      ///< what was found and what was made of it, with the names of the first one
+        std::string document;  ///< what messages call the document of the first one
+        std::size_t line;      ///< the line of the first one, from 1
+        std::size_t count;     ///< how many of this kind there were
     };
 
     /// The namespace that the document names; if it names none, the one that all its references name, otherwise this default.

@@ -1,4 +1,5 @@
 #include "client/inventory/TInventoryLoader.h"
+#include "tests/client/SourcesOf.h"
 #include "tests/client/TProgramFixture.h"
 
 namespace NORVZEL20 {
@@ -57,7 +58,7 @@ TEST_F(ManyInventoriesTest, AreLoadedAndRemarkedUponInTheirOrder)
         told += "cimdelta: " + paths.back() + ":3: tolerated: class \"Disk\" is declared again; the first declaration stands\n";
     }
     TFakeConsole console;
-    const std::vector<TInventory> inventories = TInventoryLoader(console).Load(paths);
+    const std::vector<TInventory> inventories = TInventoryLoader(console).Load(SourcesOf(paths));
     EXPECT_EQ(told, console.fErr);
     ASSERT_EQ(paths.size(), inventories.size());
     for (std::size_t i = 0; i < paths.size(); ++i) {

@@ -9,6 +9,7 @@
 #include "provider/DeltaNames.h"
 #include "provider/TDeltaNamespaceProvider.h"
 #include "tests/client/Documents.h"
+#include "tests/client/SourcesOf.h"
 #include "tests/client/TClientFixture.h"
 
 namespace NORVZEL20 {
@@ -31,8 +32,8 @@ class DifferenceListTest : public TClientFixture {
     {
         TClientFixture::SetUp();
         TFakeConsole console;
-        fInventories =
-            TInventoryLoader(console).Load({Disks("a.xml", {"sda", "sdb", "sdc"}), Disks("b.xml", {"sdb", "sdc", "sdd"})});
+        fInventories = TInventoryLoader(console).Load(
+            SourcesOf({Disks("a.xml", {"sda", "sdb", "sdc"}), Disks("b.xml", {"sdb", "sdc", "sdd"})}));
         fRules = std::make_shared<TRules>(
             fInventories[0].ns, TRulesText{"rules", "<DifftoolSpec><class name='Disk' default='include'/></DifftoolSpec>", true});
         fRecords = boost::dynamic_pointer_cast<TDeltaNamespace>(

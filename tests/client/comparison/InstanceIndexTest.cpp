@@ -5,6 +5,7 @@
 #include "client/inventory/TInventoryLoader.h"
 #include "embedded/store/TInMemClass.h"
 #include "tests/client/Documents.h"
+#include "tests/client/SourcesOf.h"
 #include "tests/client/TClientFixture.h"
 
 namespace NORVZEL20 {
@@ -21,7 +22,7 @@ class InstanceIndexTest : public TClientFixture {
             contents += Instance("Disk", Value("Id", id) + Value("Vendor", id < std::string("sdc") ? "Acme" : "Zeta"));
         }
         TFakeConsole console;
-        fInventory = TInventoryLoader(console).LoadOne(Scratch("disks.xml", Document(contents)));
+        fInventory = TInventoryLoader(console).LoadOne(SourcesOf({Scratch("disks.xml", Document(contents))}).front());
     }
 
     static std::string TextOf(const ICIMInstance& instance, const char* property)

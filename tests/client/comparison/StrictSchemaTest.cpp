@@ -2,6 +2,7 @@
 #include "client/inventory/TInventoryLoader.h"
 #include "client/process/TClientError.h"
 #include "embedded/store/TInMemInstance.h"
+#include "tests/client/SourcesOf.h"
 #include "tests/client/TFakeConsole.h"
 #include "tests/client/TPairFixture.h"
 
@@ -141,7 +142,7 @@ TEST_F(StrictSchemaTest, AKeyThatHasNoPathIsNamed)
     const std::string a = Scratch(
         "a.xml", Document(System() + Class("Part", "", "<PROPERTY.REFERENCE NAME=\"On\">" + kKey + "</PROPERTY.REFERENCE>")));
     TFakeConsole console;
-    std::vector<TInventory> inventories = TInventoryLoader(console).Load({a, a});
+    std::vector<TInventory> inventories = TInventoryLoader(console).Load(SourcesOf({a, a}));
     TCIMReference path;
     path.SetClassName("Part");
     for (int level = 0; level < 12; ++level) {

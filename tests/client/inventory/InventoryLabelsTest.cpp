@@ -5,6 +5,8 @@
 #include <boost/algorithm/string/join.hpp>
 #include <nlohmann/json.hpp>
 
+#include "client/process/TClientError.h"
+#include "tests/client/SourcesOf.h"
 #include "tests/client/TClientFixture.h"
 #include "tests/client/TOutputFolder.h"
 
@@ -13,7 +15,7 @@ namespace {
 
 std::string Labels(const std::vector<std::string>& paths)
 {
-    return boost::algorithm::join(MakeInventoryLabels(paths), "|");
+    return boost::algorithm::join(MakeInventoryLabels(SourcesOf(paths)), "|");
 }
 
 TEST(InventoryLabels, AreFileNamesWithoutDirectoryAndSuffixes)
@@ -34,7 +36,20 @@ TEST(InventoryLabels, AreNumberedWherePathsAreAlike)
 
 TEST(InventoryLabels, KeepWhatWouldBecomeEmpty)
 {
-    EXPECT_EQ(".xml|stdin|dir/", Labels({".xml", "-", "dir/"}));
+    EXPECT_EQ(".xml|stdin|/", Labels({".xml", "-", "/"}));
+}
+
+TEST(InventoryLabels, AreTheNamesOfFolders)
+{
+    EXPECT_EQ("web01|..", Labels({"srv/web01//", ".."}));
+}
+
+TEST(InventoryLabels, ThoseGivenStay)
+{
+    EXPECT_EQ("dir/web01.xml|web01|web01#2",
+              boost::algorithm::join(
+                  MakeInventoryLabels({{"", "", "dir/web01.xml", {}}, {"", "web01", "x", {}}, {"", "web01#2", "x", {}}}), "|"));
+    EXPECT_THROW(MakeInventoryLabels({{"", "web01", "x", {}}, {"", "web01", "y", {}}}), TClientError);
 }
 
 TEST(InventoryLabels, NumberedOnesDoNotCollideWithOthers)

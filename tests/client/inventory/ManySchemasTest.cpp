@@ -15,7 +15,7 @@ class ManySchemasTest : public ::testing::Test {
                  const std::vector<std::string>& properties)
     {
         while (fInventories.size() <= inventory) {
-            fInventories.push_back({std::to_string(fInventories.size()), "", TInMemNamespace::Create("root"), {}});
+            fInventories.push_back({std::to_string(fInventories.size()), {}, {}, "", TInMemNamespace::Create("root"), {}});
         }
         std::vector<TNamespaceBuilder::TProperty> declared;
         for (const std::string& property : properties) {

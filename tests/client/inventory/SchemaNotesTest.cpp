@@ -5,6 +5,7 @@
 #include "client/inventory/PropertyValue.h"
 #include "client/inventory/TInventoryLoader.h"
 #include "embedded/value/TValueText.h"
+#include "tests/client/SourcesOf.h"
 #include "tests/client/TFakeConsole.h"
 #include "tests/client/TPairFixture.h"
 
@@ -203,7 +204,7 @@ TEST_F(SchemaNotesTest, AnOperatingSystemIsMadeAfterTheStandardOneWithTheSmalles
     };
     for (const auto& row : rows) {
         TFakeConsole console;
-        std::vector<TInventory> inventories = TInventoryLoader(console).Load({Scratch("a.xml", Document(row.contents))});
+        std::vector<TInventory> inventories = TInventoryLoader(console).Load(SourcesOf({Scratch("a.xml", Document(row.contents))}));
         ASSERT_EQ(1U, MakeMissingOperatingSystems(inventories).size());
         std::string made;
         inventories[0]
@@ -235,10 +236,10 @@ TEST_F(SchemaNotesTest, AnOperatingSystemIsMadeWithTheTypesThatAreDeclared)
     };
     for (const auto& row : rows) {
         TFakeConsole console;
-        std::vector<TInventory> inventories = TInventoryLoader(console).Load({Scratch(
+        std::vector<TInventory> inventories = TInventoryLoader(console).Load(SourcesOf({Scratch(
             "a.xml", Document(Class("CIM_OperatingSystem", "", KeyProperty("Name") + Declaration("OSType", row.standard)) +
                               Instance("CIM_OperatingSystem", Value("Name", "x") + Value("OSType", row.value, row.standard)) +
-                              Class("KALMO_OperatingSystem", "", KeyProperty("Name") + Declaration("OSType", row.declared))))});
+                              Class("KALMO_OperatingSystem", "", KeyProperty("Name") + Declaration("OSType", row.declared))))}));
         ASSERT_EQ(1U, MakeMissingOperatingSystems(inventories).size());
         const boost::shared_ptr<TInMemClass> systems = inventories[0].ns->FindClass("KALMO_OperatingSystem");
         const TCIMValue made = ValueOf(*InstancesOf(*systems).at(0), "OSType");

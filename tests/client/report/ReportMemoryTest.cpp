@@ -5,6 +5,7 @@
 #include "client/report/EOutputFormat.h"
 #include "client/report/WriteReport.h"
 #include "tests/client/Documents.h"
+#include "tests/client/SourcesOf.h"
 #include "tests/client/TClientFixture.h"
 #include "tests/hostile/TMemoryMeter.h"
 
@@ -42,7 +43,7 @@ class ReportMemoryTest : public TClientFixture {
         if (fHasThird) {
             paths.push_back(Inventory("c.xml", instances, changed, "a third value, the others differ too"));
         }
-        fInventories = TInventoryLoader(fConsole).Load(paths);
+        fInventories = TInventoryLoader(fConsole).Load(SourcesOf(paths));
     }
 
     /// The most bytes that writing has in use at a time. The length of the report is added to fLength.
