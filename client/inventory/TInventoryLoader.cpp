@@ -17,7 +17,7 @@
 #include "client/files/TInputFile.h"
 #include "client/inventory/InventoryLabels.h"
 #include "client/inventory/MakeLoadOptions.h"
-#include "client/inventory/ReadSource.h"
+#include "client/inventory/TSourceReader.h"
 #include "client/process/LackOfMemory.h"
 #include "client/process/TClientError.h"
 #include "client/process/TProgress.h"
@@ -38,8 +38,9 @@ void LoadInto(TInventory& inventory, const TLoadOptions& options)
     const std::string name = NameOfInput(inventory.path);
     try {
         TLoadSession session(inventory.ns, name, options);
+        TSourceReader reader(session);
         for (const std::string& file : inventory.files) {
-            ReadSource(file, session);
+            reader.Read(file);
         }
         inventory.loaded = session.Commit();
     } catch (const TPopulateError& error) {

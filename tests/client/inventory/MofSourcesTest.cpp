@@ -1,0 +1,85 @@
+// Files of MOF as sources: what tells them apart from CIM-XML, and what they may include.
+
+#include "tests/client/Documents.h"
+#include "tests/client/TOutputFolder.h"
+#include "tests/client/TProgramFixture.h"
+
+namespace NORVZEL20 {
+namespace {
+
+const char kQualifiers[] = "Qualifier Key : boolean = false, Scope(property, reference), Flavor(DisableOverride);\n";
+const char kDisk[] = "class Disk { [Key] string Id; };\n";
+const char kSda[] = "instance of Disk { Id = \"sda\"; };\n";
+
+class MofSourcesTest : public TProgramFixture {
+  protected:
+    std::string Write(const std::string& name, const std::string& text)
+    {
+        std::filesystem::create_directories(std::filesystem::path(fFolder / name).parent_path());
+        std::ofstream(fFolder / name, std::ios::binary) << text;
+        return fFolder / name;
+    }
+
+    /// What the source holds, or the message that refuses it, with F for the folder.
+    std::string Show(const std::string& source)
+    {
+        Run({"show", source});
+        return Shorten(fStatus == 2 ? fErr : fOut, fFolder.GetPath(), "F");
+    }
+
+    const TOutputFolder fFolder;
+};
+
+std::string Utf16(const std::string& text)
+{
+    std::string bytes = "\xff\xfe";
+    for (const char c : text) {
+        bytes += c;
+        bytes += '\0';
+    }
+    return bytes;
+}
+
+TEST_F(MofSourcesTest, TheFirstBytesTellTheForm)
+{
+    const std::string all = std::string(kQualifiers) + kDisk + kSda;
+    const std::string beginnings[] = {
+        "", "// a comment\n", "/* a comment */ ", "#pragma locale(\"en_US\")\n", "\xef\xbb\xbf", " \r\n\t", std::string(4000, ' '),
+    };
+    for (const std::string& beginning : beginnings) {
+        EXPECT_EQ("Disk: 1 instance\n", Show(Write("a.xml", beginning + all))) << beginning;
+    }
+    EXPECT_EQ("Disk: 1 instance\n", Show(Write("utf16.xml", Utf16(all))));
+    EXPECT_EQ("Disk: 1 instance\n",
+              Show(Write("instance.mof", kSda) + "," + Write("class.mof", "CLASS Disk { [Key] string Id; };") + "," +
+                   Write("qualifiers.mof", kQualifiers)));
+    EXPECT_EQ("Disk: 0 instances\n", Show(Write("xml.mof", Document(Class("Disk", "", KeyProperty("Id"))))));
+}
+
+TEST_F(MofSourcesTest, BothFormsMakeOneInventory)
+{
+    const std::string schema = Write("schema.mof", std::string(kQualifiers) + kDisk);
+    const std::string instances = Write("instances.xml", "<CIM><DECLARATION><DECLGROUP>" + Instance("Disk", Value("Id", "sda")) +
+                                                             "</DECLGROUP></DECLARATION></CIM>");
+    EXPECT_EQ("Disk: 1 instance\n", Show(schema + "," + instances));
+    EXPECT_EQ("Disk: 1 instance\n", Show(instances + "," + schema));
+}
+
+TEST_F(MofSourcesTest, FilesMayBeIncludedFromTheSameFolderAndBelow)
+{
+    Write("below/disk.mof", kDisk);
+    Write("qualifiers.mof", kQualifiers);
+    const std::string main = "#pragma include (\"qualifiers.mof\")\n#pragma include (\"below/disk.mof\")\n";
+    EXPECT_EQ("Disk: 1 instance\n", Show(Write("main.mof", main + kSda)));
+    Write("other/main.mof", "#pragma include (\"../qualifiers.mof\")\n");
+    EXPECT_EQ(0u, Show(fFolder / "other/main.mof").find("cimdelta: F/other/main.mof:1:")) << fErr;
+    EXPECT_EQ(0u, Shell("show -", "cat " + (fFolder / "main.mof") + " | ").find("[2]\n--\ncimdelta: standard input:1:"));
+}
+
+TEST_F(MofSourcesTest, MistakesHaveAPlace)
+{
+    EXPECT_EQ(0u, Show(Write("a.mof", std::string(kDisk) + "class Disk {")).find("cimdelta: F/a.mof:2:")) << fErr;
+}
+
+}  // namespace
+}  // namespace NORVZEL20
