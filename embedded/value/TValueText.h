@@ -31,7 +31,7 @@ class CIMDELTA_INTERNAL_EXPORT TValueText {
     ///
     /// - a null, and a value that has the type already
     /// - an integer to an integer type whose range includes it, a number to a real type that holds it exactly
-    /// - text to a reference, or to any type that Parse can read from it
+    /// - text to a reference, if it names a class or is empty, or to any type that Parse can read from it
     /// - char16, datetime and reference to text
     /// - an array to an array, element by element; a bag stays a bag
     ///

@@ -44,10 +44,15 @@ bool ConvertToReal(const TCIMValue& value, TType::ECIMType type, TCIMValue& resu
     return true;
 }
 
+/// A path that has keys or a namespace, but no class, refers to nothing and could not be written.
 bool ConvertToPath(std::string_view text, TCIMValue& result)
 {
     try {
-        result = TCIMValue(TCIMReference::Parse(std::string(text)));
+        const TCIMReference path = TCIMReference::Parse(std::string(text));
+        if (!text.empty() && !path.GetClass()) {
+            return false;
+        }
+        result = TCIMValue(path);
         return true;
     } catch (const TZELException&) {
         return false;

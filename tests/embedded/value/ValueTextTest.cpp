@@ -182,6 +182,8 @@ TEST(ValueTextTest, ConversionThatWouldLoseSomethingIsRefused)
     EXPECT_EQ("refused", Converted(TCIMValue(u'1'), TType::kUint16));
     EXPECT_EQ("refused", Converted(TCIMValue("five"), TType::kUint16));
     EXPECT_EQ("refused", Converted(TCIMValue("no path"), TType::kReference));
+    EXPECT_EQ("refused", Converted(TCIMValue(".Id=1"), TType::kReference));
+    EXPECT_EQ("refused", Converted(TCIMValue("root/cimv2:.Id=1"), TType::kReference));
     EXPECT_EQ("refused", Converted(TCIMValue(1ul), TType::kArrayUint8));
     EXPECT_EQ("refused", Converted(TCIMValue(TType::kUint64, 1, {TCIMValue(1ul)}), TType::kUint8));
     EXPECT_EQ("refused", Converted(TCIMValue(TType::kUint64, 2, {TCIMValue(1ul), TCIMValue(256ul)}), TType::kArrayUint8));
