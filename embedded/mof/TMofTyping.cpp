@@ -39,10 +39,14 @@ bool ReadCharacterCode(const std::string& text, TCIMValue& result)
     return true;
 }
 
-/// A host says nothing without a namespace, so it is dropped, as in CIM-XML.
+/// An empty text refers to nothing. A host says nothing without a namespace, so it is dropped, as in CIM-XML.
 bool ReadReference(const std::string& text, TCIMValue& result)
 {
     TCIMValue value;
+    if (text.empty()) {
+        result = TCIMValue::Null(TType::kReference);
+        return true;
+    }
     if (!TValueText::Convert(TCIMValue(text), TType::kReference, value)) {
         return false;
     }
