@@ -1,5 +1,7 @@
 #pragma once
 
+#include "embedded/load/TLoader.h"
+
 namespace NORVZEL20 {
 
 /// Documents that were read, but of which something waits for other documents of the load: see TLoadSession::AddLate.
@@ -9,8 +11,8 @@ class ILateDocuments {
 
     /// Adds the classes that have waited, when all documents have been read.
     virtual void AddClasses() = 0;
-    /// Adds the instances that have waited, when all classes are declared.
-    virtual void AddInstances() = 0;
+    /// Adds the instances that have waited, when all classes are declared. `readObjects` is for TLoader::FillInstance.
+    virtual void AddInstances(const TLoader::TReadObjects& readObjects) = 0;
 };
 
 }  // namespace NORVZEL20

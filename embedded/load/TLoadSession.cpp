@@ -27,7 +27,7 @@ class TLoadSession::TParts {
             fLoader.DeclareClasses();
         }
         for (const boost::shared_ptr<ILateDocuments>& documents : fLate) {
-            documents->AddInstances();
+            documents->AddInstances(fReadObjects);
         }
     }
 

@@ -97,15 +97,29 @@ void TLoader::Explain(const TZELException& error, const TInMemInstance& instance
     fContext.Fail(status, "found an instance" + ofClass + " that cannot be added: " + error.what());
 }
 
+void TLoader::Fill(const TDraft& draft, const TReadObjects& readObjects)
+{
+    const TLoadContext::TAt at(fContext, draft.place);
+    fBuilder.Fill(draft, readObjects);
+    EndInstance(&draft.ownKeys);
+}
+
+void TLoader::FillInstance(TDraft draft, const TReadObjects& readObjects)
+{
+    if (fLate.IsWaiting()) {
+        AddInstance(std::move(draft));
+    } else {
+        Fill(draft, readObjects);
+    }
+}
+
 void TLoader::Finish(const TReadObjects& readObjects)
 {
     fHasEnded = true;
     fClasses.DeclareAll();
     fLate.AdaptReferences(fContext.GetOwnPlace(), *fNamespace, fClasses.CountDeclared());
     for (const TDraft& draft : fLate.TakeDrafts()) {
-        const TLoadContext::TAt at(fContext, draft.place);
-        fBuilder.Fill(draft, readObjects);
-        EndInstance(&draft.ownKeys);
+        Fill(draft, readObjects);
     }
     fContext.GetOwnPlace().Decide();
     fOwnPlace = fContext.GetOwnPlace().GetNamed();

@@ -51,6 +51,8 @@ class CIMDELTA_INTERNAL_EXPORT TLoader {
     /// these keys is there, kKeyMissing (14) if a key has no value.
     void EndInstance(const TOwnKeys* ownKeys);
     void AddInstance(TDraft draft) { fLate.Wait(std::move(draft)); }
+    /// As AddInstance, but does not let the instance wait if no other does. Call it after DeclareClasses. Errors: as Finish.
+    void FillInstance(TDraft draft, const TReadObjects& readObjects);
 
     /// Declares the classes that wait. Call it at the end of the documents, if something needs the classes before Finish. Errors:
     /// as Finish.
@@ -70,6 +72,7 @@ class CIMDELTA_INTERNAL_EXPORT TLoader {
     std::size_t CountTried() const noexcept { return fClasses.CountTried(); }
 
   private:
+    void Fill(const TDraft& draft, const TReadObjects& readObjects);
     void Add(const boost::shared_ptr<TInMemInstance>& instance);
     [[noreturn]] void Explain(const TZELException& error, const TInMemInstance& instance) const;
 

@@ -166,14 +166,19 @@ void TMofReader::AddClasses()
     }
 }
 
-void TMofReader::AddInstances()
+/// An instance is forgotten when it is added. One with an alias is kept, because others may refer to it.
+void TMofReader::AddInstances(const TLoader::TReadObjects& readObjects)
 {
-    for (const TInstances& unit : std::exchange(fUnits, {})) {
+    for (TInstances& unit : fUnits) {
         TMofInstanceMaker maker(fContext, *fSession.GetNamespace(), *this, unit);
-        for (const TMofInstance& instance : unit) {
-            fSession.GetLoader().AddInstance(maker.Make(instance));
+        for (TMofInstance& instance : unit) {
+            fSession.GetLoader().FillInstance(maker.Make(instance), readObjects);
+            if (instance.alias.empty()) {
+                instance = TMofInstance();
+            }
         }
     }
+    fUnits.clear();
 }
 
 }  // namespace NORVZEL20

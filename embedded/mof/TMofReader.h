@@ -31,7 +31,7 @@ class TMofReader : public IMofSink, public ILateDocuments {
     void OnPragma(const std::string& name, const std::string& text) override;
 
     void AddClasses() override;
-    void AddInstances() override;
+    void AddInstances(const TLoader::TReadObjects& readObjects) override;
 
   private:
     using TInstances = std::vector<TMofInstance>;
