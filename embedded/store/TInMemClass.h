@@ -11,6 +11,7 @@
 #include "embedded/store/TInMemLayout.h"
 #include "embedded/store/TInMemMethodSet.h"
 #include "embedded/store/TInMemNamedElement.h"
+#include "embedded/store/TInMemPages.h"
 #include "host/Export.h"
 #include "host/ICIMClass.h"
 
@@ -130,8 +131,10 @@ class CIMDELTA_EXPORT TInMemClass final : public TInMemNamedElement<ICIMClass>, 
     TInMemExtent& GetExtent() const;
     /// How many there are; 0 if the class is not declared.
     std::size_t GetInstanceCount() const noexcept;
-    /// A new instance with every property null, one allocation.
+    /// A new instance with every property null, at most one allocation. Its memory is part of a TInMemPage.
     boost::shared_ptr<TInMemInstance> AllocateInMemInstance();
+    /// Where they get their memory.
+    TInMemPages& GetPages() noexcept { return fPages; }
 
     /// Runs `change`, which changes the qualifiers of a property that this class itself declares, and brings this class and those
     /// below in line. Whatever `change` throws is passed on, and then nothing has changed.
@@ -162,6 +165,7 @@ class CIMDELTA_EXPORT TInMemClass final : public TInMemNamedElement<ICIMClass>, 
     std::vector<boost::weak_ptr<TInMemClass>> fAssociations;  // added by AddAssociationClass
     TInMemLayout fLayout;
     TInMemMethodSet fMethods;
+    TInMemPages fPages;
 };
 
 }  // namespace NORVZEL20

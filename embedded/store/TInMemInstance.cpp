@@ -2,13 +2,13 @@
 //
 //   [ counts of the shared pointer | TInMemInstance | property | property | ... ]
 //
-// All this is one allocation, of the size that the class has slots at that moment, and reading a property follows no pointer. The
-// property in slot n stands at position n behind the instance. When the class gets a property later, the instance cannot grow in
-// place, because handles point into it. A late block then holds slots that are missing; it is made when one of them is first
-// asked for, for all slots that the class has by then. So most instances have none, few have one, and an instance has another only
-// if the class grows again or has very many properties. Late blocks and notes are kept in the extras, which most instances do
-// without. Notes are rare facts about a slot: the value before the first MarkChanged, the key as added if it has changed since, and
-// that the property is marked as removed.
+// All this is one block, of the size that the class has slots at that moment, and reading a property follows no pointer. The blocks
+// of a class lie side by side in pages (TInMemPages). The property in slot n stands at position n behind the instance. When the
+// class gets a property later, the instance cannot grow in place, because handles point into it. A late block then holds slots that
+// are missing; it is made when one of them is first asked for, for all slots that the class has by then. So most instances have
+// none, few have one, and an instance has another only if the class grows again or has very many properties. Late blocks and notes
+// are kept in the extras, which most instances do without. Notes are rare facts about a slot: the value before the first
+// MarkChanged, the key as added if it has changed since, and that the property is marked as removed.
 
 #include "embedded/store/TInMemInstance.h"
 
@@ -73,14 +73,15 @@ TInMemProperty* TInMemInstance::GetOwnProperties() const noexcept
 
 boost::shared_ptr<TInMemInstance> TInMemInstance::Create(boost::shared_ptr<TInMemClass> cls)
 {
-    // One allocation for everything. The allocator puts the counts of the shared pointer in front of the instance.
+    // One block for everything. The allocator puts the counts of the shared pointer in front of the instance.
     using TAllocator = TPlacedAllocator<TInMemInstance>;
     const std::uint32_t slots = std::min(cls->GetLayout().GetSlotCount(), TInMemProperty::kMostBehindInstance);
     const std::size_t size = TAllocator::kPlace + sizeof(TInMemInstance) + slots * sizeof(TInMemProperty);
-    char* const block = static_cast<char*>(::operator new(size));
+    TInMemPage& page = cls->GetPages().GetPageFor(size);
+    char* const block = static_cast<char*>(page.Take(size));
     TInMemInstance* const instance = new (block + TAllocator::kPlace) TInMemInstance(std::move(cls), slots);
     const auto destroy = [](TInMemInstance* made) { made->~TInMemInstance(); };
-    return boost::shared_ptr<TInMemInstance>(instance, destroy, TAllocator(block));
+    return boost::shared_ptr<TInMemInstance>(instance, destroy, TAllocator(page));
 }
 
 TInMemInstance::TInMemInstance(boost::shared_ptr<TInMemClass> cls, std::uint32_t slots) noexcept
