@@ -17,6 +17,8 @@ using EStatus = TZELStatusCode::EStatusCode;
 
 namespace {
 
+constexpr std::uint32_t kFewInstances = 8;
+
 std::string Show(const TCIMValue& value)
 {
     return value.IsNull() ? "NULL" : Quote(value.ToText());
@@ -33,6 +35,8 @@ bool TInstanceBuilder::Begin(const char* className)
     fLayout = layout;
     fInstance = layout->cls->AllocateInMemInstance();
     fExpected = layout->first;
+    // Classes with few instances share a run, because each run has room to spare.
+    fContext.GetTexts().FillRun(++layout->count > kFewInstances ? &layout->run : nullptr);
     ++fNumber;
     return true;
 }
@@ -170,6 +174,7 @@ boost::shared_ptr<TInMemInstance> TInstanceBuilder::Take(const TOwnKeys* ownKeys
     if (ownKeys != nullptr && fInstance->FindMissingKey() != nullptr) {
         FillKeys(*ownKeys);
     }
+    fContext.GetTexts().FillRun(nullptr);
     return std::move(fInstance);
 }
 

@@ -1,10 +1,12 @@
 #pragma once
 
 #include <boost/smart_ptr/shared_ptr.hpp>
+#include <cstdint>
 #include <vector>
 
 #include "embedded/load/TLoadTarget.h"
 #include "embedded/store/TInMemClass.h"
+#include "embedded/value/TTextRun.h"
 
 namespace NORVZEL20 {
 
@@ -18,6 +20,8 @@ struct TLoadLayout {
     std::vector<TLoadTarget> targets;  ///< by slot
     TLoadTarget* first = nullptr;      ///< in the order of declaration; null if the class has no properties
     bool isHeld = false;               ///< see TLateInstances::Hold
+    std::uint32_t count = 0;           ///< of instances begun
+    TTextRun::TPointer run;            ///< the last one with texts of these instances alone, or null; see TTextPool::FillRun
 };
 
 }  // namespace NORVZEL20

@@ -60,11 +60,13 @@ TCIMValue TTextPool::MakeValue(std::string_view text)
 
 TCIMValue TTextPool::MakeInRun(std::string_view text)
 {
-    if (!fRun || !fRun->HasRoomFor(text.size())) {
-        fRun = TTextRun::Create();
+    TTextRun::TPointer& run = *fFilled;
+    if (!run || !run->HasRoomFor(text.size())) {
+        const bool isFirst = !run && fFilled != &fRun;
+        run = TTextRun::Create(isFirst ? kFirstRunSize : TTextRun::kSize);
     }
-    const std::uint16_t offset = fRun->Append(text);
-    return TValueAccess::FromRun(*fRun, offset, static_cast<std::uint16_t>(text.size()));
+    const std::uint16_t offset = run->Append(text);
+    return TValueAccess::FromRun(*run, offset, static_cast<std::uint16_t>(text.size()));
 }
 
 }  // namespace NORVZEL20

@@ -18,10 +18,19 @@ namespace NORVZEL20 {
 /// Threads: one at a time. Errors: std::bad_alloc.
 class CIMDELTA_INTERNAL_EXPORT TTextPool {
   public:
+    TTextPool() = default;
+    TTextPool(const TTextPool&) = delete;
+    TTextPool& operator=(const TTextPool&) = delete;
+
     TCIMValue MakeValue(std::string_view text);
+
+    /// From now on, texts that do not repeat go into `run`. It may be null at first, and is replaced when it is full. A null
+    /// pointer to it means the pool's own run. It must live until the next call of this or the last one of MakeValue.
+    void FillRun(TTextRun::TPointer* run) noexcept { fFilled = run != nullptr ? run : &fRun; }
 
   private:
     static constexpr std::size_t kBuckets = 1024;
+    static constexpr std::size_t kFirstRunSize = 1024;  // of a run that the caller gives; its successors have a page
 
     struct TBucket {
         std::uint32_t hash = 0;  // of the text kept
@@ -32,7 +41,8 @@ class CIMDELTA_INTERNAL_EXPORT TTextPool {
     TCIMValue MakeInRun(std::string_view text);
 
     std::array<TBucket, kBuckets> fBuckets;
-    TTextRun::TPointer fRun;  // the one that is being filled, or null
+    TTextRun::TPointer fRun;  // the last of the pool's own, or null
+    TTextRun::TPointer* fFilled = &fRun;
 };
 
 }  // namespace NORVZEL20

@@ -5,9 +5,9 @@
 
 namespace NORVZEL20 {
 
-TTextRun::TPointer TTextRun::Create()
+TTextRun::TPointer TTextRun::Create(std::size_t size)
 {
-    return TPointer(new (::operator new(kSize)) TTextRun, false);
+    return TPointer(new (::operator new(size)) TTextRun(size), false);
 }
 
 void TTextRun::Drop(const TTextRun* run) noexcept
@@ -20,14 +20,14 @@ void TTextRun::Drop(const TTextRun* run) noexcept
 
 bool TTextRun::HasRoomFor(std::size_t length) const noexcept
 {
-    return sizeof(TTextRun) + fUsed + length <= kSize;
+    return sizeof(TTextRun) + fUsed + length <= fSize;
 }
 
 std::uint16_t TTextRun::Append(std::string_view text) noexcept
 {
-    const auto offset = static_cast<std::uint16_t>(fUsed);
+    const std::uint16_t offset = fUsed;
     std::memcpy(reinterpret_cast<char*>(this + 1) + offset, text.data(), text.size());
-    fUsed += static_cast<std::uint32_t>(text.size());
+    fUsed = static_cast<std::uint16_t>(fUsed + text.size());
     return offset;
 }
 

@@ -23,11 +23,13 @@ class CIMDELTA_INTERNAL_EXPORT TTextRun : public TCounted {
     /// Bytes of a text. A longer one might leave much of a run empty.
     static constexpr std::size_t kLongestText = 512;
 
-    /// An empty run. Errors: std::bad_alloc.
-    static TPointer Create();
+    /// An empty run that takes `size` bytes of memory, at most kSize. Errors: std::bad_alloc.
+    static TPointer Create(std::size_t size = kSize);
     /// Gives up one use.
     static void Drop(const TTextRun* run) noexcept;
 
+    /// The bytes of memory that the run takes.
+    std::size_t GetSize() const noexcept { return fSize; }
     /// Whether there is room for a text of that length, which must be at most kLongestText.
     bool HasRoomFor(std::size_t length) const noexcept;
     /// Adds a text, for which there must be room, and returns its offset.
@@ -39,9 +41,10 @@ class CIMDELTA_INTERNAL_EXPORT TTextRun : public TCounted {
     }
 
   private:
-    TTextRun() noexcept = default;
+    explicit TTextRun(std::size_t size) noexcept : fSize(static_cast<std::uint16_t>(size)) {}
 
-    std::uint32_t fUsed = 0;  // of the bytes that follow the object
+    std::uint16_t fSize;
+    std::uint16_t fUsed = 0;  // of the bytes that follow the object
 };
 
 inline void intrusive_ptr_add_ref(const TTextRun* run) noexcept

@@ -111,5 +111,55 @@ TEST(TextPool, ATextThatRepeatsIsSharedFromTheSecondTimeOn)
     EXPECT_EQ(text, third.GetString());
 }
 
+TEST(TextPool, TextsGoIntoTheRunThatIsToBeFilled)
+{
+    TTextPool pool;
+    TTextRun::TPointer run;
+    const TCIMValue before = pool.MakeValue("a text before all others");
+    pool.FillRun(&run);
+    const TCIMValue first = pool.MakeValue("a text in a run given");
+    EXPECT_EQ(first.GetString().data(), run->GetText(0, 1).data());
+    pool.FillRun(nullptr);
+    const TCIMValue after = pool.MakeValue("a text after them");
+    EXPECT_EQ(before.GetString().data() + before.GetString().size(), after.GetString().data());
+    pool.FillRun(&run);
+    const TCIMValue second = pool.MakeValue("another text in it");
+    EXPECT_EQ(first.GetString().data() + first.GetString().size(), second.GetString().data());
+    // A run that is full gets a successor.
+    const TTextRun::TPointer full = run;
+    for (int number = 1000; full == run; ++number) {
+        EXPECT_EQ("one of many texts " + std::to_string(number),
+                  pool.MakeValue("one of many texts " + std::to_string(number)).GetString());
+    }
+    EXPECT_LT(full->GetSize(), run->GetSize());
+}
+
+// Documents may list the instances of many classes in any order. The text of an instance lies behind that of the instance of its
+// class before.
+TEST(LoadedMemory, TextsOfOneClassLieSideBySide)
+{
+    constexpr int kOfEachClass = 200;
+    std::string contents = TLoading::Class("Disk") + TLoading::Class("Tape");
+    const auto idOf = [](const std::string& className, int number) {
+        return "an identity of a " + className + " " + std::to_string(1000 + number);
+    };
+    for (int number = 0; number < kOfEachClass; ++number) {
+        for (const std::string className : {"Disk", "Tape"}) {
+            contents += TLoading::Instance(className, idOf(className, number));
+        }
+    }
+    TLoading loading;
+    ASSERT_EQ("", loading.ErrorOf(TLoading::Group(contents)));
+    int neighbours = 0;
+    const char* end = nullptr;
+    for (int number = 0; number < kOfEachClass; ++number) {
+        const auto instance = loading.Find("Disk.Id=\"" + idOf("Disk", number) + "\"");
+        const std::string_view id = instance->GetProperty("Id", TCallContext())->GetValue(TCallContext()).GetString();
+        neighbours += id.data() == end ? 1 : 0;
+        end = id.data() + id.size();
+    }
+    EXPECT_LE(kOfEachClass * 9 / 10, neighbours);
+}
+
 }  // namespace
 }  // namespace NORVZEL20

@@ -46,6 +46,18 @@ TEST(TextRun, TheLastTextFillsTheRunToItsEnd)
     EXPECT_EQ(std::string(rest, 'y'), values.back().GetString());
 }
 
+TEST(TextRun, ASmallRunIsFullSooner)
+{
+    const auto run = TTextRun::Create(100);
+    EXPECT_EQ(100u, run->GetSize());
+    const std::size_t room = 100 - sizeof(TTextRun);
+    EXPECT_TRUE(run->HasRoomFor(room));
+    EXPECT_FALSE(run->HasRoomFor(room + 1));
+    const std::string text(room, 'x');
+    EXPECT_EQ(text, Add(*run, text).GetString());
+    EXPECT_FALSE(run->HasRoomFor(1));
+}
+
 TEST(TextRun, AValueInARunIsLikeAnyOther)
 {
     const auto run = TTextRun::Create();
