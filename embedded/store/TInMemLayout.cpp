@@ -23,7 +23,13 @@ TInMemLayout::TInMemLayout(const TInMemLayout* super) : fSuper(super)
     CatchUp();
 }
 
-/// The slot of a name that no guess has found.
+/// The slot of a name for which the first guess was wrong.
+std::uint32_t TInMemLayout::SearchUnlikelySlot(std::string_view name) const noexcept
+{
+    const std::uint32_t likely = fLikelySlots.GuessAgain(name);
+    return likely != TLikelySlots::kNone && IsNamed(likely, name) ? likely : SearchSlot(name);
+}
+
 std::uint32_t TInMemLayout::SearchSlot(std::string_view name) const noexcept
 {
     const auto isNamed = [&](std::uint32_t slot) { return TNameText::Equal(fSlots[slot]->GetName(), name); };

@@ -32,8 +32,10 @@ class CIMDELTA_EXPORT TInMemLayout {
     std::uint32_t FindSlot(std::string_view name) const noexcept
     {
         const std::uint32_t likely = fLikelySlots.Guess(name);
-        const bool isLikely = likely != TLikelySlots::kNone && TNameText::HasSameSpelling(fSlots[likely].get()->GetName(), name);
-        return isLikely ? likely : SearchSlot(name);
+        if (likely == TLikelySlots::kNone) {
+            return SearchSlot(name);
+        }
+        return IsNamed(likely, name) ? likely : SearchUnlikelySlot(name);
     }
     /// All slots ever given, those of removed properties included.
     std::uint32_t GetSlotCount() const noexcept { return static_cast<std::uint32_t>(fSlots.size()); }
@@ -66,6 +68,11 @@ class CIMDELTA_EXPORT TInMemLayout {
     void Update(std::string_view name);
 
   private:
+    bool IsNamed(std::uint32_t slot, std::string_view name) const noexcept
+    {
+        return TNameText::HasSameSpelling(fSlots[slot].get()->GetName(), name);
+    }
+    std::uint32_t SearchUnlikelySlot(std::string_view name) const noexcept;
     std::uint32_t SearchSlot(std::string_view name) const noexcept;
     void Insert(const boost::shared_ptr<TInMemPropertyDecl>& decl, std::size_t position);
     void Resolve(std::string_view name);

@@ -1,4 +1,8 @@
 #include "embedded/store/TLikelySlots.h"
+
+#include <string>
+#include <vector>
+
 #include "tests/embedded/store/TDevicesFixture.h"
 
 namespace NORVZEL20 {
@@ -15,16 +19,73 @@ TEST(LikelySlots, ASlotIsGuessedInAnyLetterCase)
     EXPECT_EQ(TLikelySlots::kNone, slots.Guess("Size"));
 }
 
-TEST(LikelySlots, TheLastOfSeveralNamesWithOneEntryIsGuessed)
+// The two have the same first entry, and others after it.
+TEST(LikelySlots, ANameWhoseEntryIsTakenIsGuessedAgain)
 {
     TLikelySlots slots;
-    slots.Add("Axxz", 1);
-    slots.Add("Ayxz", 2);  // differs in a character that does not count
-    EXPECT_EQ(2u, slots.Guess("Axxz"));
-    slots.Remove("Axxz", 1);
-    EXPECT_EQ(2u, slots.Guess("Ayxz"));
-    slots.Remove("Ayxz", 2);
-    EXPECT_EQ(TLikelySlots::kNone, slots.Guess("Axxz"));
+    slots.Add("State", 1);
+    slots.Add("Ratio", 2);
+    EXPECT_EQ(1u, slots.Guess("Ratio"));
+    EXPECT_EQ(2u, slots.GuessAgain("Ratio"));
+    EXPECT_EQ(2u, slots.GuessAgain("rATIO"));
+    EXPECT_EQ(1u, slots.Guess("State"));
+    EXPECT_EQ(TLikelySlots::kNone, slots.GuessAgain("State"));
+    slots.Remove("Ratio", 2);
+    EXPECT_EQ(TLikelySlots::kNone, slots.GuessAgain("Ratio"));
+    EXPECT_EQ(1u, slots.Guess("State"));
+}
+
+TEST(LikelySlots, NearlyAllNamesOfALargeClassAreGuessed)
+{
+    const std::vector<std::string> names = {"InstanceID",
+                                            "Caption",
+                                            "Description",
+                                            "ElementName",
+                                            "InstallDate",
+                                            "Name",
+                                            "OperationalStatus",
+                                            "StatusDescriptions",
+                                            "Status",
+                                            "HealthState",
+                                            "CommunicationStatus",
+                                            "DetailedStatus",
+                                            "OperatingStatus",
+                                            "PrimaryStatus",
+                                            "EnabledState",
+                                            "OtherEnabledState",
+                                            "RequestedState",
+                                            "EnabledDefault",
+                                            "TimeOfLastStateChange",
+                                            "AvailableRequestedStates",
+                                            "TransitioningToState",
+                                            "SystemCreationClassName",
+                                            "SystemName",
+                                            "CreationClassName",
+                                            "DeviceID",
+                                            "PowerManagementSupported",
+                                            "PowerManagementCapabilities",
+                                            "Availability",
+                                            "StatusInfo",
+                                            "LastErrorCode",
+                                            "ErrorDescription",
+                                            "ErrorCleared",
+                                            "OtherIdentifyingInfo",
+                                            "PowerOnHours",
+                                            "TotalPowerOnHours",
+                                            "IdentifyingDescriptions",
+                                            "AdditionalAvailability",
+                                            "MaxQuiesceTime",
+                                            "DataOrganization",
+                                            "Purpose"};
+    TLikelySlots slots;
+    for (std::uint32_t slot = 0; slot < names.size(); ++slot) {
+        slots.Add(names[slot], slot);
+    }
+    std::size_t guessed = 0;
+    for (std::uint32_t slot = 0; slot < names.size(); ++slot) {
+        guessed += slots.Guess(names[slot]) == slot || slots.GuessAgain(names[slot]) == slot ? 1 : 0;
+    }
+    EXPECT_LE(names.size() * 9 / 10, guessed);
 }
 
 TEST(LikelySlots, ASlotThatNeedsMoreThanAByteIsNotGuessed)
