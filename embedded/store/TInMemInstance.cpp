@@ -147,12 +147,17 @@ boost::shared_ptr<ICIMProperty> TInMemInstance::GetHandle(std::uint32_t slot, bo
 
 boost::shared_ptr<ICIMProperty> TInMemInstance::GetProperty(const std::string& name, TCallContext) const
 {
-    const std::uint32_t slot = fClass->GetLayout().FindSlot(name);
+    const TInMemLayout& layout = fClass->GetLayout();
+    const std::uint32_t slot = layout.FindSlot(name);
     if (slot == TInMemLayout::kNoSlot) {
         throw TStoreRefusal(TZELStatusCode::kNotFound,
                             [&] { return "property " + name + " of instance " + TStoreRefusal::Shown(GetReference()); });
     }
-    return GetHandle(slot, shared_from_this());
+    const auto& decl = layout.GetSharedDecl(slot);
+    if (decl->IsStatic()) {
+        return boost::shared_ptr<ICIMProperty>(decl, &decl->GetStaticProperty());
+    }
+    return boost::shared_ptr<ICIMProperty>(shared_from_this(), &GetSlotProperty(slot));
 }
 
 void TInMemInstance::EnumerateProperties(const boost::function<bool(boost::shared_ptr<ICIMProperty>)>& callback, TCallContext) const
