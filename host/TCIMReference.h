@@ -102,13 +102,13 @@ class CIMDELTA_EXPORT TCIMReference {
     friend class TCIMValue;
     friend class TValueAccess;
     struct TContents;
+    class TGrowingOut;
 
     explicit TCIMReference(TContents* contents) noexcept;
     TContents& Own();
     void AppendText(std::string& out, TCIMValue::EKeyForm form) const;
-    bool MakePlainPath(std::string& path) const;
-    /// The approximate length of the path's text; a text in need of many escapes is longer.
-    std::size_t EstimateLength() const;
+    template <class TOut>
+    void WriteParts(TOut& out, const std::string& className) const;
 
     TContents* fContents;  // reference-counted; null means the empty path
 };

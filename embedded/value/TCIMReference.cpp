@@ -28,9 +28,6 @@ namespace NORVZEL20 {
 
 namespace {
 
-// An estimate: a longer number only makes the text grow once.
-constexpr std::size_t kUsualNumberLength = 10;
-
 // For operations that return a reference. Never destroyed: paths may still be read while the process ends.
 const std::string& GetEmptyText()
 {
@@ -48,17 +45,59 @@ void AppendPlace(std::string& out, const std::string& host, const std::string& n
     }
 }
 
-/// Copies `text` to `to` and returns the place behind it.
-char* Put(char* to, std::string_view text) noexcept
-{
-    return std::copy(text.begin(), text.end(), to);
-}
-
 void LowerFrom(std::string& out, std::size_t start)
 {
     const auto from = out.begin() + static_cast<std::ptrdiff_t>(start);
     std::transform(from, out.end(), from, [](char c) { return TNameText::ToLower(c); });
 }
+
+// What takes the parts of a path's text (TCIMReference::WriteParts). Nearly all paths have no namespace, and their keys are text
+// without anything to escape. The text of such a path is counted first and then put into memory of that length.
+
+/// Counts the characters of such a path.
+class TCountingOut {
+  public:
+    void Put(char) noexcept { ++fLength; }
+    void Put(std::string_view text) noexcept { fLength += text.size(); }
+    void PutKey(const TCIMValue& value) noexcept
+    {
+        if (!TValueAccess::IsText(value)) {
+            fIsPlain = false;
+            fLength += kUsualNumberLength;
+            return;
+        }
+        const std::string_view text = TValueAccess::GetText(value);
+        fIsPlain = fIsPlain && !TValueText::NeedsEscape(text, '"');
+        fLength += text.size() + 2;
+    }
+    /// False if a key needs more than quotes. The length is an estimate then.
+    bool IsPlain() const noexcept { return fIsPlain; }
+    std::size_t GetLength() const noexcept { return fLength; }
+
+  private:
+    static constexpr std::size_t kUsualNumberLength = 10;  // a longer number only makes the text grow once
+
+    std::size_t fLength = 0;
+    bool fIsPlain = true;
+};
+
+/// Writes the text of such a path to memory that has room for it.
+class TPlainOut {
+  public:
+    explicit TPlainOut(char* to) noexcept : fTo(to) {}
+
+    void Put(char c) noexcept { *fTo++ = c; }
+    void Put(std::string_view text) noexcept { fTo = std::copy(text.begin(), text.end(), fTo); }
+    void PutKey(const TCIMValue& value) noexcept
+    {
+        Put('"');
+        Put(TValueAccess::GetText(value));
+        Put('"');
+    }
+
+  private:
+    char* fTo;
+};
 
 }  // namespace
 
@@ -78,7 +117,7 @@ TCIMReference::TCIMReference(boost::shared_ptr<ICIMNamespace> ns, std::map<std::
             place.namespaceName = Trim(located->GetNamespaceName(), "/");
         }
     }
-    path.fContents->bindings.reserve(keys.size());
+    path.fContents->bindings.Reserve(keys.size());
     for (const auto& [name, value] : keys) {
         path.AddKeyValue(name, value);
     }
@@ -131,18 +170,18 @@ void TCIMReference::AddKeyValue(const std::string& name, const TCIMValue& value)
     auto& bindings = contents.bindings;
     // Keys mostly come in their order.
     if (bindings.empty() || TNameText::Compare(bindings.back().first, name) < 0) {
-        bindings.emplace_back(name, value);
+        bindings.Append(name, value);
         contents.depth = std::max(contents.depth, depth);
         return;
     }
-    const auto place =
+    TContents::TBinding* const place =
         std::lower_bound(bindings.begin(), bindings.end(), name, [](const TContents::TBinding& binding, const std::string& wanted) {
             return TNameText::Compare(binding.first, wanted) < 0;
         });
     if (place != bindings.end() && TNameText::Equal(place->first, name)) {
         place->second = value;
     } else {
-        bindings.emplace(place, name, value);
+        bindings.Insert(place, name, value);
     }
     contents.depth = std::max(contents.depth, depth);
 }
@@ -170,58 +209,53 @@ void TCIMReference::SetClass(boost::shared_ptr<ICIMClass> cls)
     Own().cls = std::move(cls);
 }
 
+/// Appends the text of any path.
+class TCIMReference::TGrowingOut {
+  public:
+    TGrowingOut(std::string& out, TCIMValue::EKeyForm form) noexcept : fOut(out), fForm(form) {}
+
+    void Put(char c) { fOut += c; }
+    void Put(const std::string& text) { fOut += text; }
+    void PutKey(const TCIMValue& value) { value.AppendKey(fOut, fForm); }
+
+  private:
+    std::string& fOut;
+    TCIMValue::EKeyForm fForm;
+};
+
+/// The one place that says what a path with a class and keys looks like.
+template <class TOut>
+void TCIMReference::WriteParts(TOut& out, const std::string& className) const
+{
+    out.Put(className);
+    char separator = '.';
+    for (const TContents::TBinding& binding : fContents->bindings) {
+        out.Put(separator);
+        out.Put(binding.first);
+        out.Put('=');
+        out.PutKey(binding.second);
+        separator = ',';
+    }
+}
+
 std::string TCIMReference::GetPath() const
 {
     std::string path;
-    if (!MakePlainPath(path)) {
-        path.reserve(EstimateLength());
-        AppendPath(path);
-    }
-    return path;
-}
-
-/// Makes the text of a path without namespace whose keys are all text without anything to escape, as nearly all are: in one block
-/// of the right size. Returns false for other paths.
-bool TCIMReference::MakePlainPath(std::string& path) const
-{
-    if (fContents == nullptr || fContents->place) {
-        return false;
+    if (fContents == nullptr) {
+        return path;
     }
     const std::string& className = GetClassName();
-    std::size_t length = className.size();
-    for (const TContents::TBinding& binding : fContents->bindings) {
-        if (!TValueAccess::IsText(binding.second)) {
-            return false;
-        }
-        const std::string_view text = TValueAccess::GetText(binding.second);
-        if (TValueText::NeedsEscape(text, '"')) {
-            return false;
-        }
-        length += binding.first.size() + text.size() + std::string_view(".=\"\"").size();
+    TCountingOut count;
+    WriteParts(count, className);
+    if (count.IsPlain() && !fContents->place) {
+        path = std::string(count.GetLength(), '\0');  // cheaper than growing the empty text to that length
+        TPlainOut out(path.data());
+        WriteParts(out, className);
+        return path;
     }
-    path = std::string(length, '\0');  // cheaper than growing the empty text to that length
-    char* to = Put(path.data(), className);
-    char separator = '.';
-    for (const TContents::TBinding& binding : fContents->bindings) {
-        *to++ = separator;
-        to = Put(to, binding.first);
-        *to++ = '=';
-        *to++ = '"';
-        to = Put(to, TValueAccess::GetText(binding.second));
-        *to++ = '"';
-        separator = ',';
-    }
-    return true;
-}
-
-std::size_t TCIMReference::EstimateLength() const
-{
-    std::size_t length = GetHost().size() + GetNamespaceName().size() + GetClassName().size() + 4;
-    for (std::size_t i = 0; i < GetKeyCount(); ++i) {
-        const auto& [name, value] = fContents->bindings[i];
-        length += name.size() + 4 + (TValueAccess::IsText(value) ? TValueAccess::GetText(value).size() : kUsualNumberLength);
-    }
-    return length;
+    path.reserve(count.GetLength() + GetHost().size() + GetNamespaceName().size() + std::string_view("///:").size());
+    AppendPath(path);
+    return path;
 }
 
 void TCIMReference::AppendPath(std::string& out) const
@@ -248,13 +282,8 @@ void TCIMReference::AppendText(std::string& out, TCIMValue::EKeyForm form) const
             LowerFrom(out, start);
         }
     }
-    out += GetClassName();
-    char separator = '.';
-    for (const TContents::TBinding& binding : fContents->bindings) {
-        out.append(1, separator).append(binding.first).append(1, '=');
-        binding.second.AppendKey(out, form);
-        separator = ',';
-    }
+    TGrowingOut text(out, form);
+    WriteParts(text, GetClassName());
 }
 
 boost::shared_ptr<ICIMNamespace> TCIMReference::GetNamespace() const
@@ -313,8 +342,9 @@ const TCIMValue* TCIMReference::FindKeyValue(const std::string& name) const
     }
     const auto& bindings = fContents->bindings;
     // Paths have few keys, so they are searched from the front.
-    const auto found = std::find_if(bindings.begin(), bindings.end(),
-                                    [&name](const TContents::TBinding& binding) { return TNameText::Equal(binding.first, name); });
+    const TContents::TBinding* const found =
+        std::find_if(bindings.begin(), bindings.end(),
+                     [&name](const TContents::TBinding& binding) { return TNameText::Equal(binding.first, name); });
     return found != bindings.end() ? &found->second : nullptr;
 }
 

@@ -287,14 +287,14 @@ TCIMReference TCIMReference::Parse(const std::string& text, boost::shared_ptr<IC
     }
     // The bindings are sorted and have no duplicates, so each is moved to the end instead of being searched for its place.
     TContents& contents = path.Own();
-    contents.bindings.reserve(reader.GetBindings().size());
+    contents.bindings.Reserve(reader.GetBindings().size());
     for (TPathReader::TBinding& binding : reader.GetBindings()) {
         if (cls) {
             Adapt(binding, *cls, ns);
         }
         TValueAccess::LimitDepth(binding.value, 0);  // text in quotes may hold paths that nest too deeply
         contents.depth = std::max(contents.depth, TContents::GetDepth(binding.value));
-        contents.bindings.emplace_back(std::move(binding.name), std::move(binding.value));
+        contents.bindings.Append(std::move(binding.name), std::move(binding.value));
     }
     return path;
 }

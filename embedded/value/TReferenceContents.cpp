@@ -72,10 +72,10 @@ void TCIMReference::TContents::Drop(TContents* contents) noexcept
     // What the path held may be the last use of other paths, which end here and become spares themselves.
     contents->place.reset();
     contents->cls.reset();
-    contents->bindings.clear();
+    contents->bindings.Clear();
     contents->depth = 0;
     TSpares& spares = TSpares::OfThread();
-    if (spares.isClosed || spares.count == TSpares::kMost || contents->bindings.capacity() > kMostKeptBindings) {
+    if (spares.isClosed || spares.count == TSpares::kMost || contents->bindings.GetCapacity() > kMostKeptBindings) {
         delete contents;
         return;
     }

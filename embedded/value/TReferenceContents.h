@@ -3,10 +3,9 @@
 #include <boost/smart_ptr/weak_ptr.hpp>
 #include <memory>
 #include <string>
-#include <utility>
-#include <vector>
 
 #include "embedded/value/TCounted.h"
+#include "embedded/value/TKeyBindings.h"
 #include "host/ICIMNamespace.h"
 #include "host/TCIMReference.h"
 
@@ -14,7 +13,7 @@ namespace NORVZEL20 {
 
 /// The contents of a path. Most paths in an inventory have neither namespace nor host, so the two cost one pointer.
 struct TCIMReference::TContents : TCounted {
-    using TBinding = std::pair<std::string, TCIMValue>;
+    using TBinding = TKeyBindings::TBinding;
 
     struct TPlace {
         boost::weak_ptr<ICIMNamespace> ns;
@@ -62,8 +61,8 @@ struct TCIMReference::TContents : TCounted {
 
     std::unique_ptr<TPlace> place;  // null: no namespace and no host
     boost::shared_ptr<ICIMClass> cls;
-    std::vector<TBinding> bindings;  // in the order of the names in lower case
-    unsigned int depth = 0;          // how deep references are nested in the bindings
+    TKeyBindings bindings;   // in the order of the names in lower case
+    unsigned int depth = 0;  // how deep references are nested in the bindings
 };
 
 }  // namespace NORVZEL20
