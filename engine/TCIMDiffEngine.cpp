@@ -3,6 +3,7 @@
 #include <algorithm>
 #include <utility>
 
+#include "engine/Borrow.h"
 #include "engine/TClassComparison.h"
 #include "engine/TMapCursor.h"
 #include "engine/TMasterInstance.h"
@@ -92,9 +93,10 @@ void TCIMDiffEngine::buildInstanceMap(boost::shared_ptr<TDiffClassRules> rules,
                                       std::vector<boost::shared_ptr<ICIMInstance>>& instances,
                                       std::map<std::string, TMasterInstance>& masterMap)
 {
+    const boost::shared_ptr<TDiffClassRules> borrowedRules = Borrow(rules);
     TMapCursor<std::map<std::string, TMasterInstance>> place(masterMap);
     for (const boost::shared_ptr<ICIMInstance>& instance : instances) {
-        TMasterInstance& master = place.FindOrAdd(buildPath(rules, instance)).second;
+        TMasterInstance& master = place.FindOrAdd(buildPath(borrowedRules, Borrow(instance))).second;
         if (!master.instance) {
             master.instance = instance;
         }

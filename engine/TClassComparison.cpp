@@ -3,6 +3,7 @@
 #include <string>
 #include <utility>
 
+#include "engine/Borrow.h"
 #include "engine/TInstanceWalk.h"
 #include "engine/TMessageStream.h"
 #include "host/TAddToVectorCallback.h"
@@ -173,8 +174,7 @@ void TCIMDiffEngine::TClassComparison::RecordMissingInstances()
 {
     std::map<std::string, TMasterInstance> others;
     if (HasTwoNamespaces()) {
-        std::vector<boost::shared_ptr<ICIMInstance>> instances = GetInstances(*fOtherClass);
-        fEngine.buildInstanceMap(fRules, instances, others);
+        CollectMissingInstances(others);
     }
     TMasterCursor place(others);
     for (const auto& [key, indices] : fMissing) {
@@ -183,6 +183,25 @@ void TCIMDiffEngine::TClassComparison::RecordMissingInstances()
             // If the other namespace has no such instance any more, this adds a null pointer, which fails the host's assertion.
             const auto* const other = place.Find(key);
             CopyToReference(other != nullptr ? other->second.instance : nullptr);
+        }
+    }
+}
+
+/// Indexes the other namespace's instances by the keys that they have now, but only under keys that are missing: no others are
+/// asked for.
+void TCIMDiffEngine::TClassComparison::CollectMissingInstances(std::map<std::string, TMasterInstance>& others)
+{
+    const boost::shared_ptr<TDiffClassRules> rules = Borrow(fRules);
+    TIndicesCursor missing(fMissing);
+    TMasterCursor place(others);
+    for (const boost::shared_ptr<ICIMInstance>& instance : GetInstances(*fOtherClass)) {
+        std::string key = fEngine.buildPath(rules, Borrow(instance));
+        if (missing.Find(key) == nullptr) {
+            continue;
+        }
+        TMasterInstance& other = place.FindOrAdd(std::move(key)).second;
+        if (!other.instance) {
+            other.instance = instance;
         }
     }
 }

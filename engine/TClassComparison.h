@@ -29,6 +29,7 @@ class TCIMDiffEngine::TClassComparison {
     void RecordAbsentInstances(bool excludesKeys);
     void RecordAbsentInstance(const std::string& key, const ICIMInstance& instance, const TIndices& indices, bool excludesKeys);
     void RecordMissingInstances();
+    void CollectMissingInstances(std::map<std::string, TMasterInstance>& others);
     void RecordDifferences();
     void CopyToReference(boost::shared_ptr<ICIMInstance> instance);
     bool HasTwoNamespaces() const;

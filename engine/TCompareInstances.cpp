@@ -2,6 +2,7 @@
 
 #include <utility>
 
+#include "engine/Borrow.h"
 #include "engine/TInstanceWalk.h"
 #include "spec/TDiffClassRules.h"
 
@@ -18,7 +19,7 @@ TCIMDiffEngine::TCompareInstances::TCompareInstances(TCIMDiffEngine* engine, boo
 
 std::string TCIMDiffEngine::TCompareInstances::BuildKey(const boost::shared_ptr<ICIMInstance>& instance)
 {
-    return fEngine->buildPath(fRules, instance);
+    return fEngine->buildPath(Borrow(fRules), Borrow(instance));
 }
 
 bool TCIMDiffEngine::TCompareInstances::operator()(boost::shared_ptr<ICIMInstance> instance)
@@ -32,7 +33,7 @@ bool TCIMDiffEngine::TCompareInstances::operator()(boost::shared_ptr<ICIMInstanc
 void TCIMDiffEngine::TCompareInstances::Match(TMasterInstance& master, std::string key, boost::shared_ptr<ICIMInstance> instance)
 {
     master.found = 1;
-    fEngine->compare(fRules, master.instance, std::move(instance), std::move(key), *fPropertyList, *fDifferenceMap,
+    fEngine->compare(Borrow(fRules), Borrow(master.instance), std::move(instance), std::move(key), *fPropertyList, *fDifferenceMap,
                      fNamespaceIndex);
 }
 
