@@ -1,6 +1,7 @@
 #pragma once
 
 #include <CLI/CLI.hpp>
+#include <string>
 
 #include "client/inventory/TLoadingOptions.h"
 
@@ -8,6 +9,8 @@ namespace NORVZEL20 {
 
 /// Adds the options that say how inventories are loaded, the same ones for every command. `loading` is filled while the command
 /// line is parsed. It must live as long as the command.
-void AddLoadingOptions(CLI::App* command, TLoadingOptions& loading);
+///
+/// `schemaNames` are the names of the option that gives declarations, the one for messages first.
+void AddLoadingOptions(CLI::App* command, TLoadingOptions& loading, const std::string& schemaNames);
 
 }  // namespace NORVZEL20

@@ -18,6 +18,10 @@ const char kInventoryHelp[] = "[LABEL=]SOURCE[,SOURCE...]; a source is a file of
                               "zstd, a folder of such files, or - "
                               "for standard input";
 
+// For check and explain, --schema names the inventories.
+const char kDeclarations[] = "--declarations";
+const char kSchemaNames[] = "--schema,--declarations";
+
 void AddVersion(CLI::App& app)
 {
     app.set_version_flag("--version", std::string("cimdelta ") + CIMDELTA_VERSION);
@@ -101,7 +105,7 @@ void TCommands::AddCompare()
         AddCommand("compare", "show what differs between a reference and other inventories", [this](IConsole& console) {
             std::vector<std::string> inventories = fOthers;
             inventories.insert(inventories.begin(), fReference);
-            fCompare.inventories = PrepareFiles({inventories, fCompare.rules, fCompare.output}, 2, console);
+            fCompare.inventories = PrepareFiles({inventories, fCompare.rules, fCompare.output}, fCompare.loading, 2, console);
             return RunCompare(fCompare, console);
         });
     AddText(command, "REFERENCE", fReference, kInventoryHelp)->required()->option_text(" ");
@@ -110,7 +114,7 @@ void TCommands::AddCompare()
             "a rules file that says what to compare, or - for standard input (default: everything)")
         ->option_text("RULES");
     AddFormat(command, fCompare.format);
-    AddLoadingOptions(command, fCompare.loading);
+    AddLoadingOptions(command, fCompare.loading, kSchemaNames);
     AddOutput(command, fCompare.output);
     AddStrictSchema(command, fCompare.strictSchema);
     command->add_flag("--allow-empty", fCompare.allowEmpty, "do not take it for an error if nothing was compared");
@@ -118,15 +122,15 @@ void TCommands::AddCompare()
 
 void TCommands::AddCheck()
 {
-    CLI::App* command = AddCommand("check", "show what a rules file says, what follows from it and what may be a mistake",
-                                   [this](IConsole& console) {
-                                       fCheck.schemas = PrepareFiles({fOthers, fCheck.rules, fCheck.output}, 1, console);
-                                       return RunCheck(fCheck, console);
-                                   });
+    CLI::App* command = AddCommand(
+        "check", "show what a rules file says, what follows from it and what may be a mistake", [this](IConsole& console) {
+            fCheck.schemas = PrepareFiles({fOthers, fCheck.rules, fCheck.output}, fCheck.loading, 1, console);
+            return RunCheck(fCheck, console);
+        });
     AddText(command, "RULES", fCheck.rules, "the rules file, or - for standard input")->required()->option_text(" ");
     AddSchemas(command, fOthers);
     AddStrictSchema(command, fCheck.strictSchema);
-    AddLoadingOptions(command, fCheck.loading);
+    AddLoadingOptions(command, fCheck.loading, kDeclarations);
     AddOutput(command, fCheck.output);
 }
 
@@ -134,7 +138,7 @@ void TCommands::AddExplain()
 {
     CLI::App* command =
         AddCommand("explain", "show which rule decides how a class or a property is compared", [this](IConsole& console) {
-            fExplain.schemas = PrepareFiles({fOthers, fExplain.rules, fExplain.output}, 1, console);
+            fExplain.schemas = PrepareFiles({fOthers, fExplain.rules, fExplain.output}, fExplain.loading, 1, console);
             return RunExplain(fExplain, console);
         });
     AddText(command, "ELEMENT", fExplain.element, "CLASS or CLASS.PROPERTY")->required()->option_text(" ");
@@ -142,20 +146,20 @@ void TCommands::AddExplain()
         ->option_text("RULES");
     AddSchemas(command, fOthers)->required();
     AddStrictSchema(command, fExplain.strictSchema);
-    AddLoadingOptions(command, fExplain.loading);
+    AddLoadingOptions(command, fExplain.loading, kDeclarations);
     AddOutput(command, fExplain.output);
 }
 
 void TCommands::AddQuery()
 {
     CLI::App* command = AddCommand("query", "show the instances of an inventory that match a query", [this](IConsole& console) {
-        fQuery.inventory = PrepareFiles({{fReference}, std::string(), fQuery.output}, 1, console).front();
+        fQuery.inventory = PrepareFiles({{fReference}, std::string(), fQuery.output}, fQuery.loading, 1, console).front();
         return RunQuery(fQuery, console);
     });
     AddText(command, "QUERY", fQuery.query, "WQL: SELECT * | name, ... FROM class [WHERE ...]")->required()->option_text(" ");
     AddText(command, "INVENTORY", fReference, kInventoryHelp)->required()->option_text(" ");
     AddFormat(command, fQuery.format);
-    AddLoadingOptions(command, fQuery.loading);
+    AddLoadingOptions(command, fQuery.loading, kSchemaNames);
     AddOutput(command, fQuery.output);
 }
 
@@ -163,13 +167,13 @@ void TCommands::AddShow()
 {
     CLI::App* command =
         AddCommand("show", "show the classes of an inventory, or the instances of a class", [this](IConsole& console) {
-            fShow.inventory = PrepareFiles({{fReference}, std::string(), fShow.output}, 1, console).front();
+            fShow.inventory = PrepareFiles({{fReference}, std::string(), fShow.output}, fShow.loading, 1, console).front();
             return RunShow(fShow, console);
         });
     AddText(command, "INVENTORY", fReference, kInventoryHelp)->required()->option_text(" ");
     AddText(command, "CLASS", fShow.className, "show the instances of this class and of the classes below it")->option_text(" ");
     AddFormat(command, fShow.format);
-    AddLoadingOptions(command, fShow.loading);
+    AddLoadingOptions(command, fShow.loading, kSchemaNames);
     AddOutput(command, fShow.output);
 }
 

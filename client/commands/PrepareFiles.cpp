@@ -2,12 +2,14 @@
 
 #include "client/inventory/CheckInventoryFiles.h"
 #include "client/inventory/DropRepeatedFiles.h"
+#include "client/inventory/LoadSchema.h"
 #include "client/inventory/ReadInventoryArgument.h"
 #include "client/report/TResultOutput.h"
 
 namespace NORVZEL20 {
 
-std::vector<TInventorySources> PrepareFiles(const TCommandFiles& files, std::size_t fewest, IConsole& console)
+std::vector<TInventorySources> PrepareFiles(const TCommandFiles& files, TLoadingOptions& loading, std::size_t fewest,
+                                            IConsole& console)
 {
     std::vector<TInventorySources> inventories;
     std::vector<std::string> inputs;
@@ -15,6 +17,8 @@ std::vector<TInventorySources> PrepareFiles(const TCommandFiles& files, std::siz
         inventories.push_back(ReadInventoryArgument(argument, console));
         inputs.insert(inputs.end(), inventories.back().files.begin(), inventories.back().files.end());
     }
+    loading.schemaFiles = ListSchemaFiles(loading, console);
+    inputs.insert(inputs.end(), loading.schemaFiles.begin(), loading.schemaFiles.end());
     const std::vector<std::string> toLoad = inputs;
     if (!files.rules.empty()) {
         inputs.push_back(files.rules);
@@ -22,7 +26,7 @@ std::vector<TInventorySources> PrepareFiles(const TCommandFiles& files, std::siz
     CheckOutput(files.output, inputs);
     CheckInventoryFiles(toLoad);
     inventories = DropRepeatedInventories(std::move(inventories), fewest, console);
-    RequireReadableOnce(inventories, files.rules);
+    RequireReadableOnce(inventories, loading.schemaFiles, files.rules);
     return inventories;
 }
 

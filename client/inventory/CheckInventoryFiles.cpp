@@ -56,9 +56,11 @@ void CheckInventoryFiles(const std::vector<std::string>& paths)
     }
 }
 
-void RequireReadableOnce(const std::vector<TInventorySources>& inventories, const std::string& rules)
+void RequireReadableOnce(const std::vector<TInventorySources>& inventories, const std::vector<std::string>& schemas,
+                         const std::string& rules)
 {
-    std::vector<std::string> paths(1, rules);
+    std::vector<std::string> paths = schemas;
+    paths.push_back(rules);
     for (const TInventorySources& sources : inventories) {
         paths.insert(paths.end(), sources.files.begin(), sources.files.end());
     }

@@ -41,6 +41,7 @@ std::vector<TLoadOptions> MakeLoadOptions(const TLoadingOptions& options, const 
         const auto own = names.find(label);
         const auto common = names.find("");
         load.namespaceName = own != names.end() ? own->second : common != names.end() ? common->second : "";
+        load.infersClasses = options.infersClasses;
         loads.push_back(load);
     }
     return loads;

@@ -16,14 +16,11 @@
 
 #include "client/files/TInputFile.h"
 #include "client/inventory/InventoryLabels.h"
+#include "client/inventory/LoadFiles.h"
+#include "client/inventory/LoadSchema.h"
 #include "client/inventory/MakeLoadOptions.h"
-#include "client/inventory/TSourceReader.h"
-#include "client/process/LackOfMemory.h"
-#include "client/process/TClientError.h"
 #include "client/process/TProgress.h"
 #include "client/process/TSignalsHeld.h"
-#include "embedded/load/TLoadSession.h"
-#include "embedded/load/TPopulateError.h"
 
 namespace NORVZEL20 {
 
@@ -32,24 +29,6 @@ namespace {
 const char kNamespaceName[] = "root/cimv2";
 const std::size_t kFewestAtOnce = 2;
 const std::size_t kMostAtOnce = 16;
-
-void LoadInto(TInventory& inventory, const TLoadOptions& options)
-{
-    const std::string name = NameOfInput(inventory.path);
-    try {
-        TLoadSession session(inventory.ns, name, options);
-        TSourceReader reader(session);
-        for (const std::string& file : inventory.files) {
-            reader.Read(file);
-        }
-        inventory.loaded = session.Commit();
-    } catch (const TPopulateError& error) {
-        throw TClientError(error.what());
-    } catch (const TZELException& error) {
-        ThrowIfOutOfMemory(error);
-        throw TClientError(name + ": " + error.what());
-    }
-}
 
 // Loads inventories on the calling thread and on helper threads.
 class TParallelLoad {
@@ -109,7 +88,9 @@ class TParallelLoad {
     void TryLoad(std::size_t i) noexcept
     {
         try {
-            LoadInto(fInventories[i], fOptions[i]);
+            TInventory& inventory = fInventories[i];
+            inventory.loaded =
+                LoadFiles({NameOfInput(inventory.path), inventory.files, inventory.ns}, fOptions[i], inventory.loading);
         } catch (...) {
             fFaults[i] = std::current_exception();
         }
@@ -126,7 +107,11 @@ class TParallelLoad {
 std::vector<TInventory> TInventoryLoader::Load(const std::vector<TInventorySources>& sources)
 {
     const std::vector<std::string> labels = MakeInventoryLabels(sources);
-    const std::vector<TLoadOptions> options = MakeLoadOptions(fOptions, labels);
+    std::vector<TLoadOptions> options = MakeLoadOptions(fOptions, labels);
+    const boost::shared_ptr<const TInMemNamespace> schema = LoadSchema(fOptions, fConsole);
+    for (TLoadOptions& load : options) {
+        load.schema = schema;
+    }
     std::vector<TInventory> inventories;
     for (std::size_t i = 0; i < sources.size(); ++i) {
         inventories.push_back(
@@ -137,7 +122,7 @@ std::vector<TInventory> TInventoryLoader::Load(const std::vector<TInventorySourc
         TParallelLoad(inventories, options).Run();
     }
     for (const TInventory& inventory : inventories) {
-        ReportTolerated(inventory);
+        SayTolerated(inventory.loaded, fConsole);
     }
     return inventories;
 }
@@ -145,15 +130,6 @@ std::vector<TInventory> TInventoryLoader::Load(const std::vector<TInventorySourc
 TInventory TInventoryLoader::LoadOne(const TInventorySources& sources)
 {
     return Load({sources}).front();
-}
-
-void TInventoryLoader::ReportTolerated(const TInventory& inventory)
-{
-    for (const TLoadReport::TTolerated& tolerated : inventory.loaded.tolerated) {
-        const std::string times = tolerated.count > 1 ? " (" + std::to_string(tolerated.count) + " times)" : "";
-        fConsole.Say("cimdelta: " + tolerated.document + ":" + std::to_string(tolerated.line) + ": tolerated: " + tolerated.text +
-                     times);
-    }
 }
 
 }  // namespace NORVZEL20

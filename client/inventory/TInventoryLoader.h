@@ -28,8 +28,6 @@ class TInventoryLoader {
     TInventory LoadOne(const TInventorySources& sources);
 
   private:
-    void ReportTolerated(const TInventory& inventory);
-
     IConsole& fConsole;
     TLoadingOptions fOptions;
 };

@@ -9,6 +9,14 @@ namespace NORVZEL20 {
 struct TLoadingOptions {
     /// `[LABEL=]NAME`: the namespace of inventories that name none. One without a label is for all that have no one of their own.
     std::vector<std::string> namespaces;
+    /// `SOURCE[,SOURCE...]`: what gives declarations to all inventories.
+    std::vector<std::string> schemas;
+    /// The files that these stand for, each once; see ListSchemaFiles.
+    std::vector<std::string> schemaFiles;
+    /// How the command calls the option for `schemas`, for messages.
+    std::string schemaOption = "--schema";
+    /// Whether classes that nothing declares are declared as their instances suggest.
+    bool infersClasses = false;
 };
 
 }  // namespace NORVZEL20

@@ -76,7 +76,11 @@ TSuggestedCommand& TSuggestedCommand::AddLoading(const TLoadingOptions& options)
     for (const std::string& name : options.namespaces) {
         Add("--namespace").Add(name);
     }
-    return *this;
+    for (const std::string& list : options.schemas) {
+        Add("--declarations").Add(list);
+    }
+    fCanBeRun = fCanBeRun && std::all_of(options.schemaFiles.begin(), options.schemaFiles.end(), &CanBeReadAgain);
+    return options.infersClasses ? Add("--infer-classes") : *this;
 }
 
 std::string TSuggestedCommand::Advise(const std::string& purpose) const

@@ -288,6 +288,7 @@ void TCimXmlReader::EndInstance()
         return;
     }
     if (isNamed) {
+        draft.hasName = true;
         draft.ownKeys = fPaths.GetOwnKeys();
     }
     fLoader->AddInstance(std::move(draft));

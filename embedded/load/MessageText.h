@@ -13,6 +13,6 @@ std::string Quote(std::string_view text);
 std::string DescribeSecondProperty(std::string_view property, const char* object);
 
 /// What follows the name of a class that is needed but not declared.
-inline constexpr char kIsNotDeclared[] = ", which is not declared; add its <CLASS> to the document or load it before";
+inline constexpr char kIsNotDeclared[] = ", which is not declared; give its declaration";
 
 }  // namespace NORVZEL20

@@ -57,7 +57,56 @@ boost::shared_ptr<TInMemClass> TClassQueue::Find(const char* name)
         DeclareStuck(name);
         cls = fNamespace.FindClass(name);
     }
+    while (fHasEnded && !cls && TakeMissing(name)) {
+        DeclareStuck(name);
+        cls = fNamespace.FindClass(name);
+    }
     return cls;
+}
+
+/// Those that the documents have not declared; by now they have all been read.
+void TClassQueue::DeclareQualifiersOfSchema()
+{
+    if (fHasTakenFromSchema) {
+        return;
+    }
+    fHasTakenFromSchema = true;
+    for (const boost::shared_ptr<TInMemQualifierDecl>& decl : fContext.GetOptions().schema->GetQualifierDecls()) {
+        if (!fNamespace.FindQualifierDecl(decl->GetName())) {
+            fStaging.AddQualifierDecl(decl);  // immutable, and so it may be shared
+        }
+    }
+}
+
+/// Queues the class as the schema declares it. Returns false if there is no schema, or no such class in it.
+bool TClassQueue::TakeFromSchema(const std::string& name)
+{
+    const boost::shared_ptr<const TInMemNamespace>& schema = fContext.GetOptions().schema;
+    const boost::shared_ptr<TInMemClass> cls = schema ? schema->FindClass(name) : boost::shared_ptr<TInMemClass>();
+    if (!cls) {
+        return false;
+    }
+    DeclareQualifiersOfSchema();
+    TDraft draft{TStoredObjects::FromClass(*cls), fContext.GetPlace(), {}, {}};
+    draft.propertyPlaces.assign(draft.object.GetProperties().size(), draft.place);
+    fNumbers.emplace(draft.object.GetClassName(), fEntries.size());
+    fEntries.push_back({std::move(draft), kStuck});
+    ++fContext.GetReport().classes;
+    return true;
+}
+
+/// Takes the class, or the first one above it that nobody has declared, from the schema. Returns false if it does not have it.
+bool TClassQueue::TakeMissing(const std::string& name)
+{
+    std::string missing = name;
+    for (std::size_t steps = 0; steps <= fEntries.size() && !missing.empty(); ++steps) {
+        const auto waiting = fNumbers.find(missing);
+        if (waiting == fNumbers.end()) {
+            return !fNamespace.FindClass(missing) && TakeFromSchema(missing);
+        }
+        missing = fEntries[waiting->second].draft.object.GetSuperClassName();
+    }
+    return false;
 }
 
 void TClassQueue::DeclareNew()
@@ -126,6 +175,13 @@ void TClassQueue::Declare(std::size_t number)
 
 void TClassQueue::DeclareAll()
 {
+    fHasEnded = true;
+    for (std::size_t i = 0; i < fEntries.size(); ++i) {  // taking a class adds an entry
+        const std::string superName = fEntries[i].draft.object.GetSuperClassName();
+        if (!superName.empty() && fNumbers.count(superName) == 0 && !fNamespace.FindClass(superName)) {
+            TakeFromSchema(superName);
+        }
+    }
     for (TEntry& entry : fEntries) {
         if (entry.state == kStuck) {
             entry.state = kNew;
@@ -163,7 +219,7 @@ void TClassQueue::Refuse(const TDraft& draft) const
     if (fNumbers.count(superName) > 0) {
         fContext.Fail(EStatus::kNotFound, found + ", which leads back to it or to a class that is not declared");
     }
-    fContext.Fail(EStatus::kNotFound, found + kIsNotDeclared);
+    fContext.Fail(EStatus::kNotFound, found + kIsNotDeclared, EAdvice::kGiveDeclaration);
 }
 
 std::vector<boost::shared_ptr<ICIMElement>> TClassQueue::GetClasses() const

@@ -28,7 +28,8 @@ class CIMDELTA_INTERNAL_EXPORT TClassQueue {
     /// the same. Errors: kAlreadyExists (12) if they differ.
     void Add(TDraft draft);
 
-    /// The class of that name, declared now if it is in the queue; null if it or one of its superclasses is not known yet.
+    /// The class of that name, declared now if it is in the queue; null if it or one of its superclasses is not known yet. After
+    /// DeclareAll, what nobody has declared is taken from the schema of the load (see TLoadOptions).
     /// Cost: constant for a class of the namespace; each class in the queue is tried a bounded number of times, however often this
     /// is called. Errors: those of TClassMaker.
     boost::shared_ptr<TInMemClass> Find(const char* name);
@@ -68,6 +69,9 @@ class CIMDELTA_INTERNAL_EXPORT TClassQueue {
     };
 
     void NoteRepeated(const std::string& name, bool isSame, const TRepetition& repetition);
+    void DeclareQualifiersOfSchema();
+    bool TakeFromSchema(const std::string& name);
+    bool TakeMissing(const std::string& name);
     void DeclareNew();
     void DeclareStuck(const char* name);
     void Declare(std::size_t number);
@@ -81,6 +85,8 @@ class CIMDELTA_INTERNAL_EXPORT TClassQueue {
     TNameMap<std::size_t> fNumbers;  // of the entries, by class name
     std::size_t fFirstNew = 0;       // entries in front of it have been tried
     std::size_t fDeclared = 0;
+    bool fHasEnded = false;  // all documents have been read
+    bool fHasTakenFromSchema = false;
     std::size_t fTried = 0;
 };
 

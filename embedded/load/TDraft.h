@@ -14,6 +14,7 @@ struct TDraft {
     TLoadPlace place;
     std::vector<TLoadPlace> propertyPlaces;                  ///< in the order of the object's properties
     std::vector<std::pair<std::string, TCIMValue>> ownKeys;  ///< for an instance: the keys of the name in front of it
+    bool hasName = false;        ///< whether a name stands in front of the instance, perhaps without keys
     bool takesDefaults = false;  ///< whether an instance has the defaults of its class where it gives no value
 };
 

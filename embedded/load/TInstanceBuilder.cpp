@@ -140,7 +140,8 @@ void TInstanceBuilder::Fill(const TDraft& draft, const TReadObjects& readObjects
 {
     const TEmbeddedObject& object = draft.object;
     if (!Begin(object.GetClassName().c_str())) {
-        fContext.Fail(EStatus::kNotFound, "found an instance of class " + Quote(object.GetClassName()) + kIsNotDeclared);
+        fContext.Fail(EStatus::kNotFound, "found an instance of class " + Quote(object.GetClassName()) + kIsNotDeclared,
+                      EAdvice::kGiveOrInferDeclaration);
     }
     for (std::size_t index = 0; index < object.GetProperties().size(); ++index) {
         const TLoadContext::TAt at(fContext, draft.propertyPlaces[index]);

@@ -10,8 +10,43 @@
 #include "embedded/load/TLateInstances.h"
 
 #include "embedded/store/TReferenceAdapter.h"
+#include "embedded/value/ChangeReferences.h"
+#include "host/TCIMReference.h"
 
 namespace NORVZEL20 {
+
+namespace {
+
+void VisitClasses(TCIMValue value, const boost::function<void(const std::string&)>& visit)
+{
+    ChangeReferences(value, [&](TCIMValue& reference) {
+        const TCIMReference path = reference;
+        visit(path.GetClassName());
+        path.EnumerateKeyBindings([&](const std::pair<std::string, TCIMValue>& key) {
+            VisitClasses(key.second, visit);
+            return true;
+        });
+        return false;
+    });
+}
+
+}  // namespace
+
+void TLateInstances::ForEachClass(const boost::function<void(const std::string&)>& visit) const
+{
+    for (const TDraft& draft : fDrafts) {
+        visit(draft.object.GetClassName());
+        for (const TEmbeddedObject::TProperty& property : draft.object.GetProperties()) {
+            VisitClasses(property.value, visit);
+        }
+        for (const auto& key : draft.ownKeys) {
+            VisitClasses(key.second, visit);
+        }
+    }
+    for (const auto& [instance, slot] : fReferences) {
+        VisitClasses(instance->GetSlotValue(slot), visit);
+    }
+}
 
 void TLateInstances::AdaptReferences(TOwnPlaceSearch& place, const TInMemNamespace& ns, std::size_t declared)
 {

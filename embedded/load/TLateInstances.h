@@ -1,8 +1,10 @@
 #pragma once
 
+#include <boost/function.hpp>
 #include <boost/smart_ptr/shared_ptr.hpp>
 #include <cstddef>
 #include <cstdint>
+#include <string>
 #include <utility>
 #include <vector>
 
@@ -29,6 +31,9 @@ class TLateInstances {
     bool IsWaiting() const noexcept { return fIsWaiting; }
     void Wait(TDraft draft) { fDrafts.push_back(std::move(draft)); }
 
+    /// Calls `visit` with the class of each instance that waits, and of each reference in it or noted.
+    void ForEachClass(const boost::function<void(const std::string&)>& visit) const;
+
     /// Holds an instance back, because a reference in one of its keys is noted too.
     void Hold(const boost::shared_ptr<TInMemInstance>& instance, const TLoadPlace& place) { fHeld.push_back({instance, place}); }
 
@@ -46,6 +51,7 @@ class TLateInstances {
 
     /// Those that were held and those that waited, each once and in the document's order.
     std::vector<THeld> TakeHeld() noexcept { return std::exchange(fHeld, {}); }
+    const std::vector<TDraft>& GetDrafts() const noexcept { return fDrafts; }
     std::vector<TDraft> TakeDrafts() noexcept { return std::exchange(fDrafts, {}); }
 
   private:

@@ -36,11 +36,16 @@ void TLoadContext::EndDocument()
     fOpen.pop_back();
 }
 
-void TLoadContext::Fail(TZELStatusCode::EStatusCode status, const std::string& message) const
+void TLoadContext::Fail(TZELStatusCode::EStatusCode status, const std::string& message, EAdvice advice) const
 {
     const TLoadPlace place = GetPlace();
     throw TPopulateError(status, fEmbeddedDepth > 0 ? "in an embedded object: " + message : message, NameOf(place),
-                         place.place.line, place.place.column);
+                         place.place.line, place.place.column, advice);
+}
+
+std::string TLoadContext::Describe(const TLoadPlace& place) const
+{
+    return NameOf(place) + ":" + std::to_string(place.place.line) + ":" + std::to_string(place.place.column);
 }
 
 /// Empty before the first document.

@@ -59,10 +59,12 @@ class CIMDELTA_INTERNAL_EXPORT TLoadContext {
     void EndDocument();
 
     /// Ends the load. `message` says what was found and what was expected or can be done.
-    [[noreturn]] void Fail(TZELStatusCode::EStatusCode status, const std::string& message) const;
+    [[noreturn]] void Fail(TZELStatusCode::EStatusCode status, const std::string& message, EAdvice advice = EAdvice::kNone) const;
 
     /// The place of the innermost TAt, or else the position being read.
     TLoadPlace GetPlace() const;
+    /// The same as text: `file:line:column`.
+    std::string Describe(const TLoadPlace& place) const;
     std::size_t CountDocuments() const noexcept { return fDocuments.size(); }
     /// What messages call the document of that number.
     const std::string& GetDocument(std::size_t number) const { return fDocuments[number]; }

@@ -16,6 +16,12 @@ struct TLoadReport {
         std::size_t count;     ///< how many of this kind there were
     };
 
+    /// A class that was declared as its instances suggest.
+    struct TInferred {
+        std::string className;
+        std::vector<std::string> keys;
+    };
+
     /// The namespace that the document names; if it names none, the one that all its references name, otherwise this default.
     std::string namespaceName = "root/cimv2";
     bool namesNamespace = false;           ///< whether the document names its namespace
@@ -24,6 +30,7 @@ struct TLoadReport {
     std::size_t qualifierDecls = 0;
     std::size_t classes = 0;
     std::size_t instances = 0;
+    std::vector<TInferred> inferred;    ///< in the order of their first instances
     std::vector<TTolerated> tolerated;  ///< one entry for each kind, in the order of their first ones
 };
 

@@ -15,6 +15,7 @@
 #include <utility>
 
 #include "embedded/load/MessageText.h"
+#include "embedded/load/TClassInference.h"
 
 namespace NORVZEL20 {
 
@@ -23,7 +24,12 @@ using EStatus = TZELStatusCode::EStatusCode;
 TLoader::TLoader(TLoadContext& context, const boost::shared_ptr<TInMemNamespace>& ns)
     : fContext(context), fNamespace(ns), fStaging(ns), fClasses(context, *ns, fStaging),
       fBuilder(context, *ns, fStaging, fClasses, fLate)
-{}
+
+{
+    if (fContext.GetOptions().takesDeclarationsOnly) {
+        fLate.StartWaiting();  // so that all instances come to AddInstance
+    }
+}
 
 TLoader::~TLoader() = default;
 
@@ -113,10 +119,52 @@ void TLoader::FillInstance(TDraft draft, const TReadObjects& readObjects)
     }
 }
 
+void TLoader::AddInstance(TDraft draft)
+{
+    if (!fContext.GetOptions().takesDeclarationsOnly) {
+        fLate.Wait(std::move(draft));
+    }
+}
+
+/// Declares a qualifier that the documents need not declare themselves.
+void TLoader::DeclareQualifier(const TQualifierDraft& draft)
+{
+    if (!fNamespace->FindQualifierDecl(draft.name)) {
+        fStaging.AddQualifierDecl(boost::make_shared<TInMemQualifierDecl>(draft.name, draft.value, draft.scope, draft.flavor));
+    }
+}
+
+/// Instances of classes that nothing declares wait as drafts, with all that come after the first of them.
+void TLoader::InferClasses()
+{
+    TClassInference inference(fContext);
+    for (const TDraft& draft : fLate.GetDrafts()) {
+        if (!fClasses.Find(draft.object.GetClassName().c_str())) {
+            inference.Note(draft);
+        }
+    }
+    std::vector<TDraft> classes = inference.MakeClasses();
+    if (!classes.empty()) {
+        for (const TQualifierDraft& qualifier : TClassInference::DescribeQualifiers()) {
+            DeclareQualifier(qualifier);
+        }
+    }
+    for (TDraft& cls : classes) {
+        fClasses.Add(std::move(cls));
+    }
+    fClasses.DeclareAll();
+}
+
 void TLoader::Finish(const TReadObjects& readObjects)
 {
     fHasEnded = true;
     fClasses.DeclareAll();
+    if (fContext.GetOptions().schema) {
+        fLate.ForEachClass([this](const std::string& name) { fClasses.Find(name.c_str()); });
+    }
+    if (fContext.GetOptions().infersClasses) {
+        InferClasses();
+    }
     fLate.AdaptReferences(fContext.GetOwnPlace(), *fNamespace, fClasses.CountDeclared());
     for (const TDraft& draft : fLate.TakeDrafts()) {
         Fill(draft, readObjects);

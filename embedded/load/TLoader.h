@@ -50,10 +50,13 @@ class CIMDELTA_INTERNAL_EXPORT TLoader {
     /// `ownKeys` (may be null) gives the keys that the instance itself leaves out. Errors: kAlreadyExists (12) if an instance with
     /// these keys is there, kKeyMissing (14) if a key has no value.
     void EndInstance(const TOwnKeys* ownKeys);
-    void AddInstance(TDraft draft) { fLate.Wait(std::move(draft)); }
+    void AddInstance(TDraft draft);
     /// As AddInstance, but does not let the instance wait if no other does. Call it after DeclareClasses. Errors: as Finish.
     void FillInstance(TDraft draft, const TReadObjects& readObjects);
 
+    /// The class of that name, for parts that need it before Finish; null if neither the documents nor the schema of the load have
+    /// it. Errors: those of TClassQueue::Find.
+    boost::shared_ptr<TInMemClass> FindClass(const std::string& name) { return fClasses.Find(name.c_str()); }
     /// Declares the classes that wait. Call it at the end of the documents, if something needs the classes before Finish. Errors:
     /// as Finish.
     void DeclareClasses() { fClasses.DeclareAll(); }
@@ -73,6 +76,8 @@ class CIMDELTA_INTERNAL_EXPORT TLoader {
 
   private:
     void Fill(const TDraft& draft, const TReadObjects& readObjects);
+    void InferClasses();
+    void DeclareQualifier(const TQualifierDraft& draft);
     void Add(const boost::shared_ptr<TInMemInstance>& instance);
     [[noreturn]] void Explain(const TZELException& error, const TInMemInstance& instance) const;
 

@@ -16,8 +16,9 @@ std::string Compose(const std::string& message, const std::string& file, std::si
 
 }  // namespace
 
-TPopulateError::TPopulateError(TZELStatusCode status, std::string message, std::string file, std::size_t line, std::size_t column)
-    : TZELException(status), fMessage(std::move(message)), fFile(std::move(file)), fLine(line), fColumn(column),
+TPopulateError::TPopulateError(TZELStatusCode status, std::string message, std::string file, std::size_t line, std::size_t column,
+                               EAdvice advice)
+    : TZELException(status), fMessage(std::move(message)), fFile(std::move(file)), fLine(line), fColumn(column), fAdvice(advice),
       fWhole(Compose(fMessage, fFile, fLine, fColumn))
 {}
 

@@ -3,6 +3,7 @@
 #include <cstddef>
 #include <string>
 
+#include "embedded/load/EAdvice.h"
 #include "host/Export.h"
 #include "host/TZELException.h"
 
@@ -15,7 +16,8 @@ namespace NORVZEL20 {
 class CIMDELTA_EXPORT TPopulateError : public TZELException {
   public:
     /// `line` and `column` count from 1; both are 0 if no place applies.
-    TPopulateError(TZELStatusCode status, std::string message, std::string file, std::size_t line, std::size_t column);
+    TPopulateError(TZELStatusCode status, std::string message, std::string file, std::size_t line, std::size_t column,
+                   EAdvice advice = EAdvice::kNone);
     TPopulateError(const TPopulateError& other) = default;
     TPopulateError& operator=(const TPopulateError& other) = default;
     ~TPopulateError() noexcept override;
@@ -27,6 +29,8 @@ class CIMDELTA_EXPORT TPopulateError : public TZELException {
     /// The name under which the document was loaded.
     const std::string& GetFile() const noexcept { return fFile; }
     std::size_t GetLine() const noexcept { return fLine; }
+    /// What can be done about it, for programs that have an option for it; the message says it without that option.
+    EAdvice GetAdvice() const noexcept { return fAdvice; }
     /// Counted in bytes.
     std::size_t GetColumn() const noexcept { return fColumn; }
 
@@ -35,6 +39,7 @@ class CIMDELTA_EXPORT TPopulateError : public TZELException {
     std::string fFile;
     std::size_t fLine;
     std::size_t fColumn;
+    EAdvice fAdvice;
     std::string fWhole;
 };
 

@@ -67,8 +67,10 @@ TCIMValue TMofAliases::MakeReference(const TMofInstance& instance)
 {
     const boost::shared_ptr<TInMemClass> cls = fNamespace.FindClass(instance.className);
     if (!cls) {
-        fContext.Fail(EStatus::kNotFound, "found the alias $" + instance.alias + " of an instance of class " +
-                                              Quote(instance.className) + ", which is not declared; give its declaration");
+        fContext.Fail(EStatus::kNotFound,
+                      "found the alias $" + instance.alias + " of an instance of class " + Quote(instance.className) +
+                          ", which is not declared; give its declaration",
+                      EAdvice::kGiveDeclaration);
     }
     TCIMReference path;
     path.SetClass(cls);

@@ -170,6 +170,9 @@ void TMofReader::AddClasses()
 void TMofReader::AddInstances(const TLoader::TReadObjects& readObjects)
 {
     for (TInstances& unit : fUnits) {
+        for (const TMofInstance& instance : unit) {
+            fSession.GetLoader().FindClass(instance.className);  // perhaps the load's schema has it
+        }
         TMofInstanceMaker maker(fContext, *fSession.GetNamespace(), *this, unit);
         for (TMofInstance& instance : unit) {
             fSession.GetLoader().FillInstance(maker.Make(instance), readObjects);

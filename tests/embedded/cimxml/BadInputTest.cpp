@@ -56,7 +56,7 @@ const TBadInputRow kRows[] = {
     {"unknown type", L::Group(L::Class("A", "<PROPERTY NAME=\"N\" TYPE=\"uint9\"/>")), 9,
      "doc.xml:2:164: found type \"uint9\", expected a CIM type such as string or uint32"},
     {"unknown class", L::Group(ClassWithCounter() + L::Instance("B", "1")), 15,
-     "doc.xml:3:15: found an instance of class \"B\", which is not declared; add its <CLASS> to the document or load it before"},
+     "doc.xml:3:15: found an instance of class \"B\", which is not declared; give its declaration"},
     {"unknown superclass", L::Group("<VALUE.OBJECT><CLASS NAME=\"A\" SUPERCLASS=\"B\"/></VALUE.OBJECT>"), 15,
      "doc.xml:2:15: found class \"A\" with the superclass \"B\", which is not declared; add its <CLASS> to the document or load it "
      "before"},

@@ -78,8 +78,7 @@ const TDeclarationRow kRefusedRows[] = {
     {"two objects in one", L::Group("<VALUE.OBJECT><CLASS NAME=\"A\"/><CLASS NAME=\"B\"/></VALUE.OBJECT>"),
      "doc.xml:2:32: found a second object where one is expected"},
     {"a long name, cut between characters", L::Group(L::Instance(LongName(401), "1")),
-     "doc.xml:2:15: found an instance of class \"" + LongName(79) +
-         "...\", which is not declared; add its <CLASS> to the document or load it before"},
+     "doc.xml:2:15: found an instance of class \"" + LongName(79) + "...\", which is not declared; give its declaration"},
 };
 
 const TDeclarationRow kToleratedRows[] = {

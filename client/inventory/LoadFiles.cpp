@@ -1,0 +1,54 @@
+#include "client/inventory/LoadFiles.h"
+
+#include "client/inventory/TSourceReader.h"
+#include "client/process/LackOfMemory.h"
+#include "client/process/TClientError.h"
+#include "embedded/load/TLoadSession.h"
+#include "embedded/load/TPopulateError.h"
+
+namespace NORVZEL20 {
+
+namespace {
+
+// How the options of the command line do what the error advises; follows its message.
+std::string NameOptions(EAdvice advice, const TLoadingOptions& options)
+{
+    switch (advice) {
+    case EAdvice::kGiveDeclaration:
+        return " with " + options.schemaOption + " FILE";
+    case EAdvice::kGiveOrInferDeclaration:
+        return " with " + options.schemaOption + " FILE, or let --infer-classes find it";
+    default:
+        return "";
+    }
+}
+
+}  // namespace
+
+TLoadReport LoadFiles(const TFilesToLoad& files, const TLoadOptions& load, const TLoadingOptions& options)
+{
+    try {
+        TLoadSession session(files.ns, files.name, load);
+        TSourceReader reader(session);
+        for (const std::string& file : files.files) {
+            reader.Read(file);
+        }
+        return session.Commit();
+    } catch (const TPopulateError& error) {
+        throw TClientError(error.what() + NameOptions(error.GetAdvice(), options));
+    } catch (const TZELException& error) {
+        ThrowIfOutOfMemory(error);
+        throw TClientError(files.name + ": " + error.what());
+    }
+}
+
+void SayTolerated(const TLoadReport& report, IConsole& console)
+{
+    for (const TLoadReport::TTolerated& tolerated : report.tolerated) {
+        const std::string times = tolerated.count > 1 ? " (" + std::to_string(tolerated.count) + " times)" : "";
+        console.Say("cimdelta: " + tolerated.document + ":" + std::to_string(tolerated.line) + ": tolerated: " + tolerated.text +
+                    times);
+    }
+}
+
+}  // namespace NORVZEL20

@@ -1,0 +1,33 @@
+#include "client/inventory/LoadSchema.h"
+
+#include "client/inventory/DropRepeatedFiles.h"
+#include "client/inventory/LoadFiles.h"
+#include "client/inventory/ReadInventoryArgument.h"
+#include "client/process/TProgress.h"
+
+namespace NORVZEL20 {
+
+std::vector<std::string> ListSchemaFiles(const TLoadingOptions& options, IConsole& console)
+{
+    std::vector<std::string> files;
+    for (const std::string& list : options.schemas) {
+        const std::vector<std::string> more = ReadSourceList(list, console);
+        files.insert(files.end(), more.begin(), more.end());
+    }
+    return DropRepeatedFiles(files, console);
+}
+
+boost::shared_ptr<const TInMemNamespace> LoadSchema(const TLoadingOptions& options, IConsole& console)
+{
+    if (options.schemaFiles.empty()) {
+        return nullptr;
+    }
+    const TProgress progress(console, "loading the schema");
+    TLoadOptions load;
+    load.takesDeclarationsOnly = true;
+    const boost::shared_ptr<TInMemNamespace> schema = TInMemNamespace::Create("schema");
+    SayTolerated(LoadFiles({"the schema", options.schemaFiles, schema}, load, options), console);
+    return schema;
+}
+
+}  // namespace NORVZEL20
