@@ -35,6 +35,7 @@ class TDocument {
         : fContext(session.GetContext()), fReader(fContext, session.GetNamespace(), &session.GetLoader(), parser),
           fXml(fReader, parser)
     {
+        fXml.ReadSequence();
         fContext.BeginDocument(name, fXml);
     }
 
@@ -84,9 +85,14 @@ class TDocument {
 
     void Check(bool succeeded) const
     {
-        if (!succeeded) {
-            fContext.Fail(EStatus::kParseError, "found malformed XML: " + fXml.GetError());
+        if (succeeded) {
+            return;
         }
+        const std::string open = fReader.GetOpenElement();
+        const std::string end = fXml.IsCutOff() && !open.empty()
+                                    ? "; the document ends within <" + open + ">, so it was cut off: fetch or write it again"
+                                    : "";
+        fContext.Fail(EStatus::kParseError, "found malformed XML: " + fXml.GetError() + end);
     }
 
     TLoadContext& fContext;

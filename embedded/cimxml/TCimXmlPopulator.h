@@ -14,9 +14,13 @@
 
 namespace NORVZEL20 {
 
-/// Loads CIM-XML documents (DSP0201) into a namespace, each on its own; TLoadSession loads several as one. Accepts declarations in
-/// any kind of group, and recorded requests and responses.
+/// Loads CIM-XML documents (DSP0201) into a namespace, each on its own; TLoadSession loads several as one.
 ///
+/// Forms: declarations in any kind of group, and the answers of servers to the operations that read classes and instances. A part
+/// of either may stand alone, such as an IRETURNVALUE or an INSTANCE, and several documents or parts may follow each other in one
+/// file. Of these only the first may have a document type declaration. Refused with kParseError (9) are requests, answers that are
+/// errors, an answer to an Open or Pull operation without the one that ends its sequence, and a load that has no declaration and no
+/// instance at all, such as a list of names: it would look like an inventory without instances.
 /// Order: classes may come in any order, and instances before their class. References are stored as their classes are declared,
 /// even if the declaration comes later. There is one exception: a key value without a name needs its class in front of it.
 /// Names: those of classes, properties and keys consist of ASCII letters, digits, underscores and characters beyond ASCII, so they

@@ -33,7 +33,7 @@ using EStatus = TZELStatusCode::EStatusCode;
 TCimXmlReader::TCimXmlReader(TLoadContext& context, const boost::shared_ptr<const TInMemNamespace>& ns, TLoader* loader,
                              TXmlReader::EParser parser)
     : fContext(context), fLoader(loader), fPaths(context, ns), fObjects(context, ns, fPaths, parser), fDraft(context),
-      fProperty(context, fObjects, loader, fPaths, fDraft), fQualifier(context, fObjects),
+      fAnswer(context), fProperty(context, fObjects, loader, fPaths, fDraft), fQualifier(context, fObjects),
       fFirstTag(static_cast<std::uint64_t>(context.CountDocuments()) << 32U)
 {
     Reset();
@@ -163,10 +163,16 @@ void TCimXmlReader::BeginRare(TTable::EAction action, const TCimXmlAttributes& a
         return fQualifier.BeginDecl(attributes);
     case TTable::kReadScope:
         return fQualifier.ReadScope(attributes);
-    case TTable::kReadError:
-        return ReadError(attributes);
+    case TTable::kBeginAnswer:
+        return fAnswer.Begin(attributes);
+    case TTable::kBeginOutput:
+        return fAnswer.BeginOutput(attributes);
+    case TTable::kRefuseError:
+        fAnswer.RefuseError(attributes);
+    case TTable::kRefuseRequest:
+        fAnswer.RefuseRequest(attributes);
     case TTable::kSkip:
-        return NoteSkipped(attributes);
+        return fAnswer.Skip(attributes);
     default:
         return;
     }
@@ -214,6 +220,10 @@ void TCimXmlReader::EndRare(TTable::EAction action)
         return fDraft.EndParameter();
     case TTable::kEndQualifier:
         return EndQualifier();
+    case TTable::kEndAnswer:
+        return fAnswer.End();
+    case TTable::kEndOutput:
+        return fAnswer.EndOutput(fText);
     case TTable::kEndQualifierDecl:
         return fLoader->AddQualifierDecl(fQualifier.TakeDecl());
     default:
@@ -346,27 +356,19 @@ void TCimXmlReader::EndReference()
     }
 }
 
-void TCimXmlReader::ReadError(const TCimXmlAttributes& attributes) const
-{
-    fContext.Fail(EStatus::kParseError, std::string("found a response with error ") + attributes.Get("CODE") + " (" +
-                                            Quote(attributes.Get("DESCRIPTION")) + "), expected one with objects");
-}
-
-void TCimXmlReader::NoteSkipped(const TCimXmlAttributes& attributes)
-{
-    const char* name = TElement::GetName(attributes.GetElement());
-    fContext.Tolerate(name, std::string("<") + name + "> holds no class or instance; left out");
-}
-
 void TCimXmlReader::FailUnexpected(const char* name) const
 {
     const TOpen& open = fOpen.back();
-    const std::string place = open.element == TElement::kUnknown ? " as the outermost element"
-                                                                 : std::string(" in <") + TElement::GetName(open.element) + ">";
     // Quote makes the name presentable; angle brackets take the place of its quotes.
     const std::string shown = Quote(name);
-    fContext.Fail(EStatus::kParseError, "found element <" + shown.substr(1, shown.size() - 2) + ">" + place + ", expected " +
-                                            TTable::DescribeExpected(open.state));
+    const std::string found = "found element <" + shown.substr(1, shown.size() - 2) + ">";
+    if (open.state == TTable::kStart) {
+        fContext.Fail(EStatus::kParseError, found + " as the outermost element, expected <CIM>, or a part of it such as" +
+                                                " <IRETURNVALUE>, <INSTANCE> or <CLASS>");
+    }
+    const std::string place = open.state == TTable::kEmbedded ? " as the outermost element"
+                                                              : std::string(" in <") + TElement::GetName(open.element) + ">";
+    fContext.Fail(EStatus::kParseError, found + place + ", expected " + TTable::DescribeExpected(open.state));
 }
 
 }  // namespace NORVZEL20

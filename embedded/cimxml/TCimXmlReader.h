@@ -6,6 +6,7 @@
 #include <vector>
 
 #include "embedded/cimxml/IXmlSink.h"
+#include "embedded/cimxml/TCimXmlAnswerReader.h"
 #include "embedded/cimxml/TCimXmlAttributes.h"
 #include "embedded/cimxml/TCimXmlDraftBuilder.h"
 #include "embedded/cimxml/TCimXmlItem.h"
@@ -38,6 +39,8 @@ class TCimXmlReader : public IXmlSink {
 
     /// Makes the reader ready for another document.
     void Reset();
+    /// The innermost element that is open; empty if none is.
+    const char* GetOpenElement() const noexcept { return fOpen.size() > 1 ? TElement::GetName(fOpen.back().element) : ""; }
     /// The embedded object that was read; null if the document did not end. Each is returned once.
     boost::shared_ptr<const TEmbeddedObject> TakeObject() noexcept;
     /// See TCimXmlPathReader::TakeMetUnsettled.
@@ -86,14 +89,13 @@ class TCimXmlReader : public IXmlSink {
     void BeginValue();
     void EndText();
     void EndReference();
-    void ReadError(const TCimXmlAttributes& attributes) const;
-    void NoteSkipped(const TCimXmlAttributes& attributes);
 
     TLoadContext& fContext;
     TLoader* fLoader;
     TCimXmlPathReader fPaths;
     TCimXmlObjectReader fObjects;
     TCimXmlDraftBuilder fDraft;
+    TCimXmlAnswerReader fAnswer;
     TCimXmlPropertyReader fProperty;
     TCimXmlQualifierReader fQualifier;
     TCimXmlItem* fItem = &fProperty.GetItem();  // what a value belongs to: the property, or the qualifier that is open

@@ -35,8 +35,10 @@ struct TRow {
 };
 
 constexpr TRow kRows[] = {
-    // The document's element; for an embedded object there is none around it.
+    // The document's element, further ones by kParts; for an embedded object there is none around it.
     {T::kStart, E::kCim, T::kCim, T::kNothing},
+    {T::kStart, E::kIReturnValue, T::kReturned, T::kNothing},
+    {T::kStart, E::kError, T::kSkipped, T::kRefuseError},
     {T::kEmbedded, E::kInstance, T::kInstance, T::kBeginInstance},
     {T::kEmbedded, E::kClass, T::kClass, T::kBeginClass},
 
@@ -47,33 +49,34 @@ constexpr TRow kRows[] = {
     {T::kDeclaration, E::kDeclGroupWithName, T::kGroup, T::kNothing},
     {T::kDeclaration, E::kDeclGroupWithPath, T::kGroup, T::kNothing},
 
-    // Recorded requests and responses: what they carry is loaded, what only refers to objects is left out.
-    {T::kMessage, E::kSimpleReq, T::kRequest, T::kNothing},
-    {T::kMessage, E::kMultiReq, T::kMultiRequest, T::kNothing},
+    // Recorded answers: the objects in them are loaded, what only refers to objects is left out. Requests and errors are refused.
     {T::kMessage, E::kSimpleRsp, T::kResponse, T::kNothing},
     {T::kMessage, E::kMultiRsp, T::kMultiResponse, T::kNothing},
+    {T::kMessage, E::kSimpleReq, T::kRequest, T::kNothing},
+    {T::kMessage, E::kMultiReq, T::kMultiRequest, T::kNothing},
     {T::kMultiRequest, E::kSimpleReq, T::kRequest, T::kNothing},
     {T::kRequest, E::kCorrelator, T::kSkipped, T::kNothing},
-    {T::kRequest, E::kIMethodCall, T::kCall, T::kNothing},
-    {T::kRequest, E::kMethodCall, T::kSkipped, T::kSkip},
-    {T::kCall, E::kLocalNamespacePath, T::kLocalNamespacePath, T::kBeginNamespacePath},
-    {T::kCall, E::kIParamValue, T::kCallParameter, T::kNothing},
-    {T::kCallParameter, E::kClass, T::kClass, T::kBeginClass},
-    {T::kCallParameter, E::kInstance, T::kInstance, T::kBeginInstance},
-    {T::kCallParameter, E::kValueNamedInstance, T::kObject, T::kBeginObject},
-    {T::kCallParameter, E::kQualifierDeclaration, T::kQualifierDecl, T::kBeginQualifierDecl},
-    {T::kCallParameter, E::kValue, T::kSkipped, T::kNothing},
-    {T::kCallParameter, E::kValueArray, T::kSkipped, T::kNothing},
-    {T::kCallParameter, E::kValueReference, T::kSkipped, T::kNothing},
-    {T::kCallParameter, E::kClassName, T::kSkipped, T::kNothing},
-    {T::kCallParameter, E::kInstanceName, T::kSkipped, T::kNothing},
+    {T::kRequest, E::kIMethodCall, T::kSkipped, T::kRefuseRequest},
+    {T::kRequest, E::kMethodCall, T::kSkipped, T::kRefuseRequest},
     {T::kMultiResponse, E::kSimpleRsp, T::kResponse, T::kNothing},
-    {T::kResponse, E::kIMethodResponse, T::kResult, T::kNothing},
-    {T::kResponse, E::kMethodResponse, T::kResult, T::kNothing},
-    {T::kResult, E::kError, T::kError, T::kReadError},
+    {T::kResponse, E::kIMethodResponse, T::kResult, T::kBeginAnswer},
+    {T::kResponse, E::kMethodResponse, T::kMethodResult, T::kSkip},
+    {T::kMethodResult, E::kError, T::kSkipped, T::kRefuseError},
+    {T::kMethodResult, E::kReturnValue, T::kSkipped, T::kNothing},
+    {T::kMethodResult, E::kParamValue, T::kSkipped, T::kNothing},
+    {T::kResult, E::kError, T::kSkipped, T::kRefuseError},
     {T::kResult, E::kIReturnValue, T::kReturned, T::kNothing},
-    {T::kResult, E::kReturnValue, T::kSkipped, T::kSkip},
-    {T::kResult, E::kParamValue, T::kSkipped, T::kNothing},
+    {T::kResult, E::kParamValue, T::kOutput, T::kBeginOutput},
+    {T::kOutput, E::kValue, T::kOutputText, T::kNothing},
+    {T::kOutput, E::kValueNull, T::kSkipped, T::kNothing},
+    {T::kOutput, E::kValueArray, T::kSkipped, T::kNothing},
+    {T::kOutput, E::kValueReference, T::kSkipped, T::kNothing},
+    {T::kOutput, E::kValueRefArray, T::kSkipped, T::kNothing},
+    {T::kOutput, E::kValueNamedInstance, T::kSkipped, T::kNothing},
+    {T::kOutput, E::kClassName, T::kSkipped, T::kNothing},
+    {T::kOutput, E::kInstanceName, T::kSkipped, T::kNothing},
+    {T::kOutput, E::kClass, T::kSkipped, T::kNothing},
+    {T::kOutput, E::kInstance, T::kSkipped, T::kNothing},
     {T::kReturned, E::kClass, T::kClass, T::kBeginClass},
     {T::kReturned, E::kInstance, T::kInstance, T::kBeginInstance},
     {T::kReturned, E::kQualifierDeclaration, T::kQualifierDecl, T::kBeginQualifierDecl},
@@ -86,6 +89,9 @@ constexpr TRow kRows[] = {
     {T::kReturned, E::kClassName, T::kSkipped, T::kSkip},
     {T::kReturned, E::kInstanceName, T::kSkipped, T::kSkip},
     {T::kReturned, E::kInstancePath, T::kSkipped, T::kSkip},
+    {T::kReturned, E::kLocalInstancePath, T::kSkipped, T::kSkip},
+    {T::kReturned, E::kClassPath, T::kSkipped, T::kSkip},
+    {T::kReturned, E::kLocalClassPath, T::kSkipped, T::kSkip},
     {T::kReturned, E::kObjectPath, T::kSkipped, T::kSkip},
     {T::kReturned, E::kValue, T::kSkipped, T::kSkip},
     {T::kReturned, E::kValueArray, T::kSkipped, T::kSkip},
@@ -175,12 +181,26 @@ constexpr TRow kRows[] = {
     {T::kKeyBinding, E::kValueReference, T::kReference, T::kBeginReference},
 };
 
+// Of a recorded answer, or of declarations, users keep a part too: what may stand in these states may stand alone.
+constexpr T::EState kParts[] = {T::kCim, T::kDeclaration, T::kMessage, T::kResponse, T::kReturned};
+
+constexpr bool IsRowOf(const TRow& row, T::EState state)
+{
+    bool isPart = false;
+    for (const T::EState part : kParts) {
+        isPart = isPart || (state == T::kStart && row.state == part);
+    }
+    return row.state == state || isPart;
+}
+
 constexpr std::array<T::EAction, T::kStateCount> MakeEndActions()
 {
     std::array<T::EAction, T::kStateCount> actions{};
     for (T::EAction& action : actions) {
         action = T::kNothing;
     }
+    actions[T::kResult] = T::kEndAnswer;
+    actions[T::kOutputText] = T::kEndOutput;
     actions[T::kObject] = T::kEndObject;
     actions[T::kClass] = T::kEndClass;
     actions[T::kInstance] = T::kEndInstance;
@@ -210,6 +230,9 @@ constexpr TSteps MakeSteps()
     TSteps steps{};
     for (const TRow& row : kRows) {
         steps[row.state][row.element] = {row.next, row.action};
+        if (IsRowOf(row, T::kStart)) {
+            steps[T::kStart][row.element] = {row.next, row.action};
+        }
     }
     for (T::TStep& step : steps[T::kSkipped]) {  // anything may stand in what is left out
         step = {T::kSkipped, T::kNothing};
@@ -236,7 +259,7 @@ std::string TCimXmlTable::DescribeExpected(EState state)
 {
     std::vector<std::string> names;
     for (const TRow& row : kRows) {
-        if (row.state == state) {
+        if (IsRowOf(row, state)) {
             names.push_back(std::string("<") + TCimXmlElement::GetName(row.element) + ">");
         }
     }

@@ -14,7 +14,7 @@ namespace NORVZEL20 {
 class CIMDELTA_INTERNAL_EXPORT TCimXmlTable {
   public:
     enum EState : unsigned char {
-        kStart = 0,  ///< before the document's element
+        kStart = 0,  ///< before the document's element, which may be a part of an answer too
         kEmbedded,   ///< before the element of an embedded object's text
         kCim,
         kDeclaration,
@@ -22,11 +22,12 @@ class CIMDELTA_INTERNAL_EXPORT TCimXmlTable {
         kMessage,
         kMultiRequest,
         kRequest,
-        kCall,
-        kCallParameter,
         kMultiResponse,
         kResponse,
         kResult,
+        kOutput,      ///< PARAMVALUE
+        kOutputText,  ///< its VALUE
+        kMethodResult,
         kReturned,
         kObject,  ///< VALUE.OBJECT and its relatives
         kClass,
@@ -56,7 +57,6 @@ class CIMDELTA_INTERNAL_EXPORT TCimXmlTable {
         kInstanceName,
         kKeyBinding,
         kKeyValue,
-        kError,
         kSkipped,  ///< an element with any contents, none of which is loaded
         kStateCount
     };
@@ -99,7 +99,12 @@ class CIMDELTA_INTERNAL_EXPORT TCimXmlTable {
         kEndKeyBinding,
         kBeginKeyValue,
         kEndKeyValue,
-        kReadError,
+        kBeginAnswer,
+        kEndAnswer,
+        kBeginOutput,
+        kEndOutput,
+        kRefuseError,
+        kRefuseRequest,
         kSkip  ///< leaves the element out and says so in the report
     };
 
@@ -118,7 +123,7 @@ class CIMDELTA_INTERNAL_EXPORT TCimXmlTable {
     /// Whether character data may stand in `state`; elsewhere only white space may.
     static bool TakesText(EState state) noexcept
     {
-        return state == kText || state == kKeyValue || state == kHost || state == kSkipped;
+        return state == kText || state == kKeyValue || state == kHost || state == kOutputText || state == kSkipped;
     }
     /// The elements that `state` accepts, for messages: "<A>, <B> or <C>", or "nothing".
     static std::string DescribeExpected(EState state);

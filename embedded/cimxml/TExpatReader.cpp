@@ -71,7 +71,7 @@ struct TExpatReader::TCallbacks {
     static void End(void* user, const char* name) noexcept
     {
         Guarded(user, [=](TExpatReader& reader) {
-            --reader.fDepth;
+            reader.fHasEnded = --reader.fDepth == 0;
             reader.HandOverText();
             reader.fSink.OnEnd(name);
             reader.fText.clear();
@@ -164,6 +164,7 @@ void TExpatReader::Reset(const char* encoding, const TXmlProgress& progress)
     Install();  // from here on, events go to the sink
     fText = progress.text;
     fDepth = progress.depth;
+    fHasEnded = !tags.empty() && fDepth == 0;
     fBytes = fReceived = tags.size();
     fLinesBefore = progress.place.line - 1;
     // Of the first line, the library knows only what follows on the tags.
@@ -171,7 +172,7 @@ void TExpatReader::Reset(const char* encoding, const TXmlProgress& progress)
     fEntities = fDefaultBytes = 0;
     fError.clear();
     fException = nullptr;
-    fStopped = false;
+    fStopped = fIsCutOff = fMetInvalidToken = false;
 }
 
 /// Why the attributes are too many or too long; null if they are not.
@@ -196,9 +197,11 @@ bool TExpatReader::Parse(const char* data, std::size_t length, bool last)
 {
     std::string_view rest(data, length);
     fReceived += length;
+    fUnread = 0;
     while (!fStopped && !rest.empty()) {
         const std::string_view piece = rest.substr(0, GetPieceLength(rest));
         rest.remove_prefix(piece.size());
+        fUnread = rest.size();
         if (!ParsePiece(piece, last && rest.empty())) {
             return false;
         }
@@ -268,6 +271,9 @@ bool TExpatReader::Settle(bool succeeded)
         if (code == XML_ERROR_NO_MEMORY) {
             throw std::bad_alloc();
         }
+        fMetInvalidToken = code == XML_ERROR_INVALID_TOKEN;
+        fIsCutOff = code == XML_ERROR_NO_ELEMENTS || code == XML_ERROR_UNCLOSED_TOKEN || code == XML_ERROR_PARTIAL_CHAR ||
+                    code == XML_ERROR_UNCLOSED_CDATA_SECTION;
         Refuse(XML_ErrorString(code));
         return false;
     }
@@ -287,6 +293,15 @@ std::size_t TExpatReader::GetPending() const
 {
     const XML_Index index = XML_GetCurrentByteIndex(fParser.get());
     return index < 0 ? 0 : fBytes - static_cast<std::size_t>(index);
+}
+
+std::string_view TExpatReader::GetRest() const
+{
+    int offset = 0;
+    int size = 0;
+    const char* const buffer = XML_GetInputContext(fParser.get(), &offset, &size);
+    return buffer != nullptr ? std::string_view(buffer, static_cast<std::size_t>(size)).substr(static_cast<std::size_t>(offset))
+                             : std::string_view();
 }
 
 void TExpatReader::Stop()

@@ -38,6 +38,14 @@ class TExpatReader {
     std::size_t GetPending() const;
     void Stop();
     const std::string& GetError() const noexcept { return fError; }
+    bool IsCutOff() const noexcept { return fIsCutOff; }
+    bool MetInvalidToken() const noexcept { return fMetInvalidToken; }
+    /// Whether the outermost element has ended.
+    bool HasEnded() const noexcept { return fHasEnded; }
+    /// After an error: the bytes from the token in error on, as far as the library has them. Valid until the next call.
+    std::string_view GetRest() const;
+    /// How many bytes of the last call of Parse the library was not given.
+    std::size_t CountUnread() const noexcept { return fUnread; }
     TTextPlace GetPlace() const;
 
   private:
@@ -68,6 +76,10 @@ class TExpatReader {
     std::string fError;
     std::exception_ptr fException;
     bool fStopped = false;
+    bool fHasEnded = false;  // the outermost element
+    bool fIsCutOff = false;
+    bool fMetInvalidToken = false;
+    std::size_t fUnread = 0;
     bool fRefusesDocumentTypes = false;
     TTextPlace fPlace;  // at which the parse was stopped
 };

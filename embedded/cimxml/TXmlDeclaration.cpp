@@ -100,4 +100,25 @@ EXmlScan TXmlDeclaration::Pass(const char*& at, const char* end) noexcept
     return EXmlScan::kAccepted;
 }
 
+EXmlScan TXmlDeclaration::FindNext(const char* at, const char* end) noexcept
+{
+    constexpr std::string_view kBegin = "<?xml";
+    const std::string_view bytes(at, static_cast<std::size_t>(end - at));
+    for (const std::string_view mark : {"\xef\xbb\xbf", "\xfe\xff", "\xff\xfe"}) {
+        if (bytes.substr(0, mark.size()) == mark) {
+            return EXmlScan::kAccepted;
+        }
+    }
+    if (bytes.empty() || bytes[0] != '<') {
+        return EXmlScan::kRefused;
+    }
+    if (bytes.size() <= kBegin.size() && kBegin.substr(0, bytes.size()) == bytes) {
+        return EXmlScan::kCutOff;
+    }
+    const char next = bytes[1];
+    const bool isTag = (next >= 'A' && next <= 'Z') || (next >= 'a' && next <= 'z') || next == '_' || next == ':';
+    const bool isDeclaration = bytes.substr(0, kBegin.size()) == kBegin && TXmlCharacter::IsBlank(bytes[kBegin.size()]);
+    return isTag || isDeclaration ? EXmlScan::kAccepted : EXmlScan::kRefused;
+}
+
 }  // namespace NORVZEL20

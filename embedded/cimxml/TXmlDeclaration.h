@@ -12,6 +12,10 @@ class TXmlDeclaration {
     /// Moves `at`, the beginning of a document, over the declaration, if there is one. Refuses versions and encodings other than
     /// these. The bytes end at `end`, and a NUL is there.
     static EXmlScan Pass(const char*& at, const char* end) noexcept;
+
+    /// Accepts what begins at `at` as the beginning of another document, behind the end of one: a start tag whose name begins with
+    /// a letter of ASCII, a declaration or a byte order mark. The bytes end at `end`.
+    static EXmlScan FindNext(const char* at, const char* end) noexcept;
 };
 
 }  // namespace NORVZEL20

@@ -13,6 +13,7 @@ struct TXmlProgress {
     std::size_t depth = 0;  ///< open elements
     std::string text;       ///< since the last tag
     TTextPlace place;       ///< of the next byte
+    bool isFirst = true;    ///< false if another document of a sequence is in front of it
 };
 
 }  // namespace NORVZEL20

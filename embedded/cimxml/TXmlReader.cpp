@@ -4,13 +4,19 @@
 // tags of the open elements, of which the sink sees nothing, then the refused token and all that follows. Lines and columns are
 // shifted to where the token stands. So nothing that has been read need be kept, and whether a document is in error, why and where,
 // is always said by Expat.
+//
+// In a sequence of documents, Expat's error shows where the next one begins: it refuses what stands behind the outermost element.
+// Then the tokenizer begins again, at that byte. Mostly the byte is among those that the caller has just handed over; what Expat
+// has kept of earlier ones is copied.
 #include "embedded/cimxml/TXmlReader.h"
 
 #include <algorithm>
 #include <cstring>
 #include <string_view>
+#include <utility>
 
 #include "embedded/cimxml/TExpatReader.h"
+#include "embedded/cimxml/TXmlDeclaration.h"
 #include "embedded/cimxml/TXmlTokenizer.h"
 
 namespace NORVZEL20 {
@@ -28,6 +34,12 @@ void TXmlReader::RefuseDocumentTypes() noexcept
     fExpat->RefuseDocumentTypes();
 }
 
+void TXmlReader::ReadSequence() noexcept
+{
+    fReadsSequence = true;
+    fTokenizer->ReadSequence();
+}
+
 void TXmlReader::Reset(const char* encoding)
 {
     fEncoding = encoding;
@@ -41,25 +53,43 @@ void TXmlReader::Reset(const char* encoding)
 
 bool TXmlReader::Parse(const char* data, std::size_t length, bool last)
 {
-    return fIsTokenizing ? ParseFromMemory(data, length, last) : fExpat->Parse(data, length, last);
+    return ParseAll(std::string_view(data, length), last);
+}
+
+bool TXmlReader::ParseAll(std::string_view bytes, bool last)
+{
+    for (;;) {
+        fHasNext = false;
+        const bool succeeded = fIsTokenizing ? ParseFromMemory(bytes, last) : ParseWithExpat(bytes, last);
+        if (succeeded || !fHasNext) {
+            return succeeded;
+        }
+        bytes = fNext;
+        const std::string held = std::exchange(fHeld, std::string());
+        BeginNext();
+        // What is in `held` begins a document, so nothing is held when this returns.
+        if (!held.empty() && !ParseAll(held, false)) {
+            return false;
+        }
+    }
 }
 
 /// The tokenizer gets the bytes in slices that stay in the processor's cache.
-bool TXmlReader::ParseFromMemory(const char* data, std::size_t length, bool last)
+bool TXmlReader::ParseFromMemory(std::string_view bytes, bool last)
 {
     constexpr std::size_t kSlice = 64 * 1024;
     std::size_t done = 0;
     do {
-        const std::size_t slice = std::min(length - done, kSlice);
+        const std::size_t slice = std::min(bytes.size() - done, kSlice);
         char* const room = fTokenizer->GetRoom(slice);
         if (slice > 0) {
-            std::memcpy(room, data + done, slice);
+            std::memcpy(room, bytes.data() + done, slice);
         }
         done += slice;
-        if (!fIsStopped && !Scan(slice, last && done == length)) {
-            return Leave(data, length, last, done);
+        if (!fIsStopped && !Scan(slice, last && done == bytes.size())) {
+            return Leave(bytes, last, done);
         }
-    } while (done < length);
+    } while (done < bytes.size());
     return true;
 }
 
@@ -74,21 +104,68 @@ bool TXmlReader::Scan(std::size_t length, bool last)
     }
 }
 
-/// From now on Expat reads: what the tokenizer has left of earlier bytes, then `data`, of which the tokenizer has had `done` bytes.
-bool TXmlReader::Leave(const char* data, std::size_t length, bool last, std::size_t done)
+/// From now on Expat reads: what the tokenizer has left of earlier bytes, then `bytes`, of which the tokenizer has had `done`.
+bool TXmlReader::Leave(std::string_view bytes, bool last, std::size_t done)
 {
     const TXmlProgress progress = fTokenizer->TakeProgress();
+    if (!progress.isFirst) {
+        fExpat->RefuseDocumentTypes();  // each could expand entities up to the bound of a whole document
+    }
     // The tokenizer has accepted the beginning as UTF-8.
     fExpat->Reset(progress.tags.empty() ? fEncoding : "UTF-8", progress);
     fIsTokenizing = false;
     const std::string_view rest = fTokenizer->GetRest();
     const std::size_t earlier = rest.size() - std::min(rest.size(), done);
-    const std::size_t from = done - (rest.size() - earlier);
-    if (!fExpat->Parse(rest.data(), earlier, false)) {
+    bytes.remove_prefix(done - (rest.size() - earlier));
+    if (!ParseWithExpat(rest.substr(0, earlier), false)) {
+        fHeld += fNext;
+        fNext = bytes;
         return false;
     }
     fTokenizer->ReleaseMemory();
-    return fExpat->Parse(data + from, length - from, last);
+    return ParseWithExpat(bytes, last);
+}
+
+/// If another document of a sequence begins, returns false and notes where.
+bool TXmlReader::ParseWithExpat(std::string_view bytes, bool last)
+{
+    if (fExpat->Parse(bytes.data(), bytes.size(), last)) {
+        return true;
+    }
+    fHasNext = HasNextDocument();
+    if (fHasNext) {
+        const std::string_view rest = fExpat->GetRest();
+        const std::size_t length = rest.size() + fExpat->CountUnread();
+        fHeld = rest.substr(0, length - std::min(length, bytes.size()));
+        fNext = bytes.substr(bytes.size() - std::min(length, bytes.size()));
+    }
+    return false;
+}
+
+/// Whether Expat has refused something behind the outermost element that begins another document.
+bool TXmlReader::HasNextDocument() const
+{
+    if (!fReadsSequence || !fExpat->HasEnded()) {
+        return false;
+    }
+    const std::string_view rest = fExpat->GetRest();
+    // The place of an invalid token is within it, unless it is a byte order mark.
+    return TXmlDeclaration::FindNext(rest.data(), rest.data() + rest.size()) == EXmlScan::kAccepted &&
+           (rest.front() != '<' || !fExpat->MetInvalidToken());
+}
+
+/// Begins the next document of a sequence at the place that Expat has refused.
+void TXmlReader::BeginNext()
+{
+    TXmlProgress progress;
+    progress.place = fExpat->GetPlace();
+    fIsTokenizing = fParser == EParser::kTokenizer;
+    if (fIsTokenizing) {
+        fTokenizer->BeginNext(progress.place);
+    } else {
+        fExpat->RefuseDocumentTypes();
+        fExpat->Reset(fEncoding, progress);
+    }
 }
 
 char* TXmlReader::GetBuffer(std::size_t length)
@@ -98,10 +175,21 @@ char* TXmlReader::GetBuffer(std::size_t length)
 
 bool TXmlReader::ParseBuffer(std::size_t length)
 {
+    fHasNext = false;
+    bool succeeded = true;
     if (!fIsTokenizing) {
-        return fExpat->ParseBuffer(length);
+        succeeded = fExpat->ParseBuffer(length);
+        fHasNext = !succeeded && HasNextDocument();
+        fHeld = fHasNext ? fExpat->GetRest() : std::string_view();
+    } else if (!fIsStopped && !Scan(length, false)) {
+        succeeded = Leave(std::string_view(), false, 0);
     }
-    return fIsStopped || Scan(length, false) || Leave("", 0, false, 0);
+    if (succeeded || !fHasNext) {
+        return succeeded;
+    }
+    const std::string held = std::exchange(fHeld, std::string());
+    BeginNext();
+    return ParseAll(held, false);
 }
 
 std::size_t TXmlReader::GetPending() const
@@ -124,6 +212,11 @@ const std::string& TXmlReader::GetError() const noexcept
 {
     static const std::string fgNone;
     return fIsTokenizing ? fgNone : fExpat->GetError();
+}
+
+bool TXmlReader::IsCutOff() const noexcept
+{
+    return !fIsTokenizing && fExpat->IsCutOff();
 }
 
 TTextPlace TXmlReader::GetPlace() const

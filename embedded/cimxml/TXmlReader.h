@@ -3,6 +3,7 @@
 #include <cstddef>
 #include <memory>
 #include <string>
+#include <string_view>
 
 #include "embedded/cimxml/IXmlSink.h"
 #include "embedded/load/IPlaceSource.h"
@@ -37,6 +38,10 @@ class CIMDELTA_INTERNAL_EXPORT TXmlReader : public IPlaceSource {
     /// From the next Reset on, a document with a document type declaration is in error, so it cannot declare entities.
     void RefuseDocumentTypes() noexcept;
 
+    /// From now on reads documents that follow each other, as one: behind the end of an outermost element, another document may
+    /// begin, with an XML declaration or without. Only the first one may have a document type declaration. Lines go on.
+    void ReadSequence() noexcept;
+
     /// Makes the reader ready for a new document; `encoding` (null, or a literal) overrides the one that the document declares.
     /// Errors: std::bad_alloc.
     void Reset(const char* encoding = nullptr);
@@ -56,6 +61,8 @@ class CIMDELTA_INTERNAL_EXPORT TXmlReader : public IPlaceSource {
 
     /// Why the document is in error; empty if it is not.
     const std::string& GetError() const noexcept;
+    /// Whether it is in error because it ends early.
+    bool IsCutOff() const noexcept;
 
     /// The place of the event or error. Cost: linear in the bytes since the last call.
     TTextPlace GetPlace() const override;
@@ -68,9 +75,13 @@ class CIMDELTA_INTERNAL_EXPORT TXmlReader : public IPlaceSource {
     bool HasLeftToExpat() const noexcept { return !fIsTokenizing; }
 
   private:
+    bool ParseAll(std::string_view bytes, bool last);
+    bool ParseFromMemory(std::string_view bytes, bool last);
     bool Scan(std::size_t length, bool last);
-    bool ParseFromMemory(const char* data, std::size_t length, bool last);
-    bool Leave(const char* data, std::size_t length, bool last, std::size_t done);
+    bool Leave(std::string_view bytes, bool last, std::size_t done);
+    bool ParseWithExpat(std::string_view bytes, bool last);
+    bool HasNextDocument() const;
+    void BeginNext();
     void Stop();
 
     const EParser fParser;
@@ -78,6 +89,10 @@ class CIMDELTA_INTERNAL_EXPORT TXmlReader : public IPlaceSource {
     std::unique_ptr<TExpatReader> fExpat;
     const char* fEncoding = nullptr;
     bool fIsTokenizing = true;
+    bool fReadsSequence = false;
+    bool fHasNext = false;    // Expat has stopped where another document begins, with fHeld and fNext
+    std::string fHeld;        // the beginning of that document, as far as it is not among the caller's bytes
+    std::string_view fNext;   // the rest of the caller's bytes
     bool fIsStopped = false;  // while tokenizing
     TTextPlace fPlace;        // at which it was stopped
 };

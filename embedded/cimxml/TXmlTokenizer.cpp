@@ -1,12 +1,13 @@
 // Plain XML, token by token.
 //
+//     sequence  document*
 //     document  declaration? (blanks | comment)* element (blanks | comment)*
 //     element   start-tag (text | comment | element)* end-tag
 //
 // Each token is looked at as a whole before anything of it is handed out. It is accepted, or the bytes end within it, or it is
 // refused: then Expat goes on from there. Refused are document types, processing instructions, CDATA sections, references to other
 // entities, names beyond ASCII, whatever is not well-formed, and whatever is very long or deep. Before the first start tag, Expat
-// begins anew.
+// begins anew. Mostly only one document is read; if it is a sequence, whatever cannot follow on a document begins the next one.
 //
 // Text is mostly one run of bytes in the window, which is handed out from there. If it is not (a reference or a carriage return
 // stands for something else, a comment interrupts it, or the window ends), its runs are gathered. The window keeps the bytes as
@@ -19,6 +20,7 @@
 #include <utility>
 
 #include "embedded/cimxml/TXmlCharacter.h"
+#include "embedded/cimxml/TXmlComment.h"
 #include "embedded/cimxml/TXmlDeclaration.h"
 #include "embedded/cimxml/TXmlReference.h"
 #include "embedded/cimxml/TXmlSearch.h"
@@ -29,31 +31,6 @@ namespace NORVZEL20 {
 
 namespace {
 
-/// Moves `at` over the rest of a comment.
-EXmlScan PassComment(const char*& at, const char* end)
-{
-    for (;;) {
-        at = TXmlSearch::FindSpecial(at, '-');
-        if (*at == '-' && at[1] == '-') {
-            if (at + 2 >= end) {
-                return EXmlScan::kCutOff;
-            }
-            at += 3;
-            return at[-1] == '>' ? EXmlScan::kAccepted : EXmlScan::kRefused;
-        }
-        if (static_cast<unsigned char>(*at) >= 0x80U) {
-            const EXmlScan scan = TXmlCharacter::Pass(at, end);
-            if (scan != EXmlScan::kAccepted) {
-                return scan;
-            }
-        } else if (static_cast<unsigned char>(*at) >= ' ' || TXmlCharacter::IsBlank(*at)) {
-            ++at;
-        } else {
-            return at == end ? EXmlScan::kCutOff : EXmlScan::kRefused;
-        }
-    }
-}
-
 constexpr std::size_t kLongestToken = 64 * 1024;  // that may be cut off; also the longest prolog
 constexpr std::size_t kLongestText = 1024 * 1024;
 constexpr std::size_t kMostOpen = 256;  // elements; Expat is given all their tags
@@ -62,15 +39,17 @@ constexpr std::size_t kMostOpen = 256;  // elements; Expat is given all their ta
 
 void TXmlTokenizer::Reset() noexcept
 {
-    fWindow.Reset();
-    fTags.BeginDocument();
-    fOpen.Clear();
-    fText.clear();
-    fEvent = nullptr;
-    fProlog = 0;
-    fAwaited = 0;
-    fHasBegun = false;
+    fWindow.Reset(TTextPlace());
+    BeginDocument();
+    fIsFirst = true;
     fIsStopped = false;
+}
+
+void TXmlTokenizer::BeginNext(const TTextPlace& place) noexcept
+{
+    fWindow.Reset(place);
+    BeginDocument();
+    fIsFirst = false;
 }
 
 TXmlTokenizer::EOutcome TXmlTokenizer::Scan(std::size_t length, bool last)
@@ -82,6 +61,19 @@ TXmlTokenizer::EOutcome TXmlTokenizer::Scan(std::size_t length, bool last)
     fScanned += GetUnread();
     fAt = fWindow.GetBegin() + fProlog;
     fRun = fAt;
+    EXmlScan scan = ScanDocument();
+    while (fMetNext) {
+        fMetNext = false;
+        fIsFirst = false;
+        fWindow.Release(fAt);
+        BeginDocument();
+        scan = ScanDocument();
+    }
+    return fIsStopped ? EOutcome::kDone : Pause(scan, last);
+}
+
+EXmlScan TXmlTokenizer::ScanDocument()
+{
     EXmlScan scan = fHasBegun ? EXmlScan::kAccepted : ScanProlog();
     if (scan == EXmlScan::kAccepted) {
         scan = ScanContent();
@@ -89,7 +81,7 @@ TXmlTokenizer::EOutcome TXmlTokenizer::Scan(std::size_t length, bool last)
     if (scan == EXmlScan::kAccepted && !fIsStopped) {
         scan = ScanEpilog();
     }
-    return fIsStopped ? EOutcome::kDone : Pause(scan, last);
+    return scan;
 }
 
 /// Whether a token that was cut off cannot have ended in the last `length` bytes. It is scanned from its beginning, so without a
@@ -165,6 +157,11 @@ EXmlScan TXmlTokenizer::ScanEpilog()
         if (scan == EXmlScan::kAccepted) {
             if (fAt == fWindow.GetEnd()) {
                 return EXmlScan::kAccepted;
+            }
+            const EXmlScan next = fReadsSequence ? TXmlDeclaration::FindNext(fAt, fWindow.GetEnd()) : EXmlScan::kRefused;
+            fMetNext = next == EXmlScan::kAccepted;
+            if (next != EXmlScan::kRefused) {
+                return next;
             }
             scan = ScanComment();
         }
@@ -338,7 +335,7 @@ EXmlScan TXmlTokenizer::ScanComment()
         return static_cast<std::size_t>(end - fAt) < kBegin.size() ? EXmlScan::kCutOff : EXmlScan::kRefused;
     }
     const char* at = fAt + kBegin.size();
-    const EXmlScan scan = PassComment(at, end);
+    const EXmlScan scan = TXmlComment::Pass(at, end);
     if (scan != EXmlScan::kAccepted) {
         return scan;
     }
@@ -385,8 +382,9 @@ TXmlProgress TXmlTokenizer::TakeProgress()
         progress.tags = fOpen.IsEmpty() ? "<a/>" : fOpen.MakeTags();
         progress.depth = fOpen.GetDepth();
         progress.text = std::move(fText);
-        progress.place = fWindow.GetPlace(fWindow.GetBegin());
     }
+    progress.place = fWindow.GetPlace(fWindow.GetBegin());
+    progress.isFirst = fIsFirst;
     return progress;
 }
 

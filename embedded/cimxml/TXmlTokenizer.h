@@ -31,6 +31,9 @@ class TXmlTokenizer {
     /// The sink must outlive the tokenizer.
     explicit TXmlTokenizer(IXmlSink& sink) : fSink(sink) {}
 
+    /// From now on reads a sequence of documents: behind one, another may begin.
+    void ReadSequence() noexcept { fReadsSequence = true; }
+
     /// Makes the tokenizer ready for a new document. Known tags stay known.
     void Reset() noexcept;
 
@@ -49,6 +52,9 @@ class TXmlTokenizer {
     /// The bytes from that token on; before the first start tag, the whole document.
     std::string_view GetRest() noexcept { return std::string_view(fWindow.GetBegin(), fWindow.GetLength()); }
 
+    /// Begins another document of a sequence, at `place`, with an empty window.
+    void BeginNext(const TTextPlace& place) noexcept;
+
     /// Frees what the document has taken. Nothing of the document can be asked for after that.
     void ReleaseMemory() noexcept;
 
@@ -58,6 +64,17 @@ class TXmlTokenizer {
     std::size_t CountScanned() const noexcept { return fScanned; }
 
   private:
+    void BeginDocument() noexcept
+    {
+        fTags.BeginDocument();
+        fOpen.Clear();
+        fText.clear();
+        fEvent = nullptr;
+        fProlog = 0;
+        fAwaited = 0;
+        fHasBegun = false;
+    }
+    EXmlScan ScanDocument();
     EXmlScan ScanProlog();
     EXmlScan ScanContent();
     EXmlScan ScanEpilog();
@@ -101,6 +118,9 @@ class TXmlTokenizer {
     std::size_t fScanned = 0;
     bool fHasBegun = false;  // the outermost element
     bool fIsStopped = false;
+    bool fReadsSequence = false;
+    bool fIsFirst = true;   // document of the sequence
+    bool fMetNext = false;  // in the epilog: another document begins at fAt
 };
 
 }  // namespace NORVZEL20

@@ -30,11 +30,11 @@ void Advance(TTextPlace& place, const char* from, const char* to) noexcept
 
 static_assert(TXmlWindow::kPad > TXmlSearch::kReadsBeyond, "a search stays in the buffer");
 
-void TXmlWindow::Reset() noexcept
+void TXmlWindow::Reset(const TTextPlace& place) noexcept
 {
     fBegin = fEnd = fBuffer.get();
     fCounted = fBegin;
-    fPlace = TTextPlace();
+    fPlace = place;
 }
 
 /// If little is left, it moves to the front. Otherwise the new buffer is large enough that as much can come before the next move.

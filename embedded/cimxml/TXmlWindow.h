@@ -16,8 +16,8 @@ class TXmlWindow {
   public:
     static constexpr std::size_t kPad = 64;
 
-    /// Forgets the document.
-    void Reset() noexcept;
+    /// Forgets the document. The next byte will be at `place`.
+    void Reset(const TTextPlace& place) noexcept;
 
     /// Room for `length` bytes behind the last one. Moves the bytes, so all other pointers become invalid. Errors: std::bad_alloc.
     char* GetRoom(std::size_t length);

@@ -103,6 +103,14 @@ void TLoadContext::NoteNamespace(const std::string& name, const std::string& hos
     }
 }
 
+void TLoadContext::CheckContents()
+{
+    if (const std::optional<TLoadContents::TFault> fault = fContents.FindFault()) {
+        const TAt at(*this, fault->place);
+        Fail(TZELStatusCode::kParseError, fault->message);
+    }
+}
+
 /// Other characters, such as a dot, a comma or a colon, could make two different paths read the same.
 void TLoadContext::CheckName(const char* what, std::string_view name) const
 {

@@ -8,6 +8,7 @@
 #include <vector>
 
 #include "embedded/load/IPlaceSource.h"
+#include "embedded/load/TLoadContents.h"
 #include "embedded/load/TLoadOptions.h"
 #include "embedded/load/TLoadPlace.h"
 #include "embedded/load/TLoadReport.h"
@@ -82,6 +83,10 @@ class CIMDELTA_INTERNAL_EXPORT TLoadContext {
     /// Decides which references stay within the document's own namespace.
     TOwnPlaceSearch& GetOwnPlace() noexcept { return fOwnPlace; }
     TTextPool& GetTexts() noexcept { return fTexts; }
+    TLoadContents& GetContents() noexcept { return fContents; }
+    /// Call it when all documents have been read. Errors: fails with kParseError (9) if they hold nothing that can be loaded, or an
+    /// answer whose continuation is missing; see TLoadContents.
+    void CheckContents();
 
     /// Call these two around the reading of an embedded object; messages then mention that they are about one. Errors: fails with
     /// kParseError (9) if objects are nested too deeply. An error ends the load, so code that throws need not call
@@ -125,6 +130,7 @@ class CIMDELTA_INTERNAL_EXPORT TLoadContext {
     std::vector<const char*> fKinds;  // of the entries of fReport.tolerated
     TTextPool fTexts;
     TLoadOptions fOptions;
+    TLoadContents fContents;
     std::size_t fEmbeddedDepth = 0;  // embedded objects that are being read, one inside of the other
 };
 

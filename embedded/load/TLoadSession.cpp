@@ -67,6 +67,7 @@ void TLoadSession::KeepElements()
 TLoadReport TLoadSession::Commit()
 {
     TLoader& loader = fParts->fLoader;
+    fParts->fContext.CheckContents();
     fParts->fContext.Guard([&] {
         fParts->AddLate();
         loader.Finish(fParts->fReadObjects);

@@ -35,6 +35,7 @@ TLoader::~TLoader() = default;
 
 void TLoader::AddQualifierDecl(const TQualifierDraft& draft)
 {
+    fContext.GetContents().NoteObject();
     const boost::shared_ptr<TInMemQualifierDecl> known = fNamespace->FindQualifierDecl(draft.name);
     if (!known) {
         fStaging.AddQualifierDecl(boost::make_shared<TInMemQualifierDecl>(draft.name, draft.value, draft.scope, draft.flavor));
@@ -50,11 +51,13 @@ void TLoader::AddQualifierDecl(const TQualifierDraft& draft)
 
 void TLoader::AddClass(TDraft draft)
 {
+    fContext.GetContents().NoteObject();
     fClasses.Add(std::move(draft));
 }
 
 bool TLoader::BeginInstance(const char* className)
 {
+    fContext.GetContents().NoteObject();
     if (!fLate.IsWaiting() && fBuilder.Begin(className)) {
         return true;
     }

@@ -125,7 +125,11 @@ TEST_F(BoundedWorkTest, AGigabyteOfElementsInTheWrongPlaceIsRefusedAtOnce)
 /// Comments between elements are not kept.
 TEST_F(BoundedWorkTest, MuchOfNothingTakesNoMemory)
 {
-    EXPECT_EQ("loaded", Load(TGeneratedText(kGroup, "<!-- nothing -->\n", 4 * kMegabyte, "</DECLGROUP></DECLARATION></CIM>")));
+    // A class that the namespace has; without any, the document would be refused.
+    const std::string end = "<CLASS NAME=\"KALMO_OperatingSystem\"><PROPERTY NAME=\"Name\" TYPE=\"string\"><QUALIFIER NAME=\"Key\""
+                            " TYPE=\"boolean\"><VALUE>TRUE</VALUE></QUALIFIER></PROPERTY><PROPERTY NAME=\"OSType\""
+                            " TYPE=\"uint16\"/></CLASS></DECLGROUP></DECLARATION></CIM>";
+    EXPECT_EQ("loaded", Load(TGeneratedText(kGroup, "<!-- nothing -->\n", 4 * kMegabyte, end)));
     EXPECT_LE(fPeak, 16 * kMegabyte);
 }
 

@@ -95,7 +95,7 @@ TEST(MemoryMeterTest, WhatWasThereBeforeDoesNotCount)
 TEST(MemoryMeterTest, MemoryOfTheLibrariesCounts)
 {
     const std::string head = "<CIM CIMVERSION=\"2.0\" DTDVERSION=\"2.0\"><DECLARATION><DECLGROUP>";
-    const std::string tail = "</DECLGROUP></DECLARATION></CIM>";
+    const std::string tail = "<QUALIFIER.DECLARATION NAME=\"Other\" TYPE=\"boolean\"/></DECLGROUP></DECLARATION></CIM>";
     const std::string instance = head +
                                  "<VALUE.OBJECT><INSTANCE CLASSNAME=\"Device\"><PROPERTY NAME=\"Id\" TYPE=\"string\"><VALUE>" +
                                  std::string(kMuch, 'x') + "</VALUE></PROPERTY></INSTANCE></VALUE.OBJECT>" + tail;

@@ -32,15 +32,21 @@ const TBadInputRow kRows[] = {
     {"empty", "", 9, "doc.xml:1:1: found an empty document, expected CIM-XML"},
     {"blank", "\n\n", 9, "doc.xml:3:1: found malformed XML: no element found"},
     {"no XML at all", "hello", 9, "doc.xml:1:1: found malformed XML: syntax error"},
-    {"truncated", kHead + "<VALUE.OBJECT>\n", 9, "doc.xml:3:1: found malformed XML: no element found"},
-    {"truncated in a tag", kHead + "<VALUE.OBJ", 9, "doc.xml:2:1: found malformed XML: unclosed token"},
+    {"truncated", kHead + "<VALUE.OBJECT>\n", 9,
+     "doc.xml:3:1: found malformed XML: no element found; the document ends within <VALUE.OBJECT>, so it was cut off: fetch or "
+     "write it again"},
+    {"truncated in a tag", kHead + "<VALUE.OBJ", 9,
+     "doc.xml:2:1: found malformed XML: unclosed token; the document ends within <DECLGROUP>, so it was cut off: fetch or write it "
+     "again"},
     {"malformed", kHead + "<VALUE.OBJECT></CLASS>", 9, "doc.xml:2:17: found malformed XML: mismatched tag"},
     {"a NUL", kHead + std::string("<VALUE.OBJECT>\0", 15), 9, "doc.xml:2:15: found malformed XML: not well-formed (invalid token)"},
     {"no UTF-8", L::Group(ClassWithCounter() + L::Instance("A", "\xFF")), 9,
      "doc.xml:3:80: found malformed XML: not well-formed (invalid token)"},
     {"unknown encoding", "<?xml version=\"1.0\" encoding=\"EBCDIC-42\"?><CIM/>", 9,
      "doc.xml:1:31: found malformed XML: unknown encoding"},
-    {"another document", "<html/>", 9, "doc.xml:1:1: found element <html> as the outermost element, expected <CIM>"},
+    {"another document", "<html/>", 9,
+     "doc.xml:1:1: found element <html> as the outermost element, expected <CIM>, or a part of it such as <IRETURNVALUE>, "
+     "<INSTANCE> or <CLASS>"},
     {"unknown element", L::Group("<VALUE.OBJCT/>"), 9,
      "doc.xml:2:1: found element <VALUE.OBJCT> in <DECLGROUP>, expected <LOCALNAMESPACEPATH>, <NAMESPACEPATH>, "
      "<QUALIFIER.DECLARATION>, <VALUE.OBJECT>, <VALUE.NAMEDOBJECT>, <VALUE.NAMEDINSTANCE>, <VALUE.OBJECTWITHPATH>, "
@@ -79,7 +85,8 @@ const TBadInputRow kRows[] = {
     {"class twice, differing", L::Group(L::Class("A") + ClassWithCounter()), 12,
      "doc.xml:3:15: found class \"A\" a second time, declared differently; remove one of the two"},
     {"recorded error", "<CIM><MESSAGE><SIMPLERSP><IMETHODRESPONSE><ERROR CODE=\"6\" DESCRIPTION=\"gone\"/>", 9,
-     "doc.xml:1:43: found a response with error 6 (\"gone\"), expected one with objects"},
+     "doc.xml:1:43: found an error as the answer: CIM_ERR_NOT_FOUND (6), \"gone\"; expected an answer with objects, so ask the "
+     "server again"},
     {"two namespaces",
      L::Group("<LOCALNAMESPACEPATH><NAMESPACE NAME=\"a\"/></LOCALNAMESPACEPATH>\n"
               "<LOCALNAMESPACEPATH><NAMESPACE NAME=\"b\"/></LOCALNAMESPACEPATH>\n"),

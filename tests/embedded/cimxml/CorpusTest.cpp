@@ -222,9 +222,8 @@ TEST(PywbemResponseTest, ARecordedErrorIsAnError)
         loading.LoadFile(kPywbem + "11-response-error.xml");
         FAIL();
     } catch (const TZELException& error) {
-        EXPECT_EQ(kPywbem +
-                      "11-response-error.xml:2:128: found a response with error 6 (\"not <found> & gone\"), expected one with "
-                      "objects",
+        EXPECT_EQ(kPywbem + "11-response-error.xml:2:128: found an error as the answer to \"GetInstance\": CIM_ERR_NOT_FOUND (6), "
+                            "\"not <found> & gone\"; expected an answer with objects, so ask the server again",
                   error.what());
     }
 }

@@ -275,9 +275,9 @@ TEST_F(PopulatorTest, EmbeddedObjectsDoNotNestForEver)
 
 TEST_F(PopulatorTest, WhatHoldsNoObjectsIsReportedOnce)
 {
-    const TLoadReport report =
-        fLoading.Load("<CIM><MESSAGE><SIMPLERSP><IMETHODRESPONSE><IRETURNVALUE><INSTANCENAME CLASSNAME=\"A\"/>"
-                      "<INSTANCENAME CLASSNAME=\"A\"/></IRETURNVALUE></IMETHODRESPONSE></SIMPLERSP></MESSAGE></CIM>");
+    const TLoadReport report = fLoading.Load(
+        "<CIM><MESSAGE><SIMPLERSP><IMETHODRESPONSE><IRETURNVALUE><INSTANCENAME CLASSNAME=\"A\"/>"
+        "<INSTANCENAME CLASSNAME=\"A\"/><CLASS NAME=\"A\"/></IRETURNVALUE></IMETHODRESPONSE></SIMPLERSP></MESSAGE></CIM>");
     EXPECT_EQ("1: <INSTANCENAME> holds no class or instance; left out (2)\n", L::Tolerated(report));
 }
 

@@ -29,7 +29,12 @@ bool EndsLineBehindRoot(std::string_view document, std::size_t piece)
 /// Writes down the events.
 class TEventLog : public IXmlSink {
   public:
-    explicit TEventLog(TXmlReader::EParser parser) : fReader(*this, parser) {}
+    TEventLog(TXmlReader::EParser parser, bool isSequence) : fReader(*this, parser)
+    {
+        if (isSequence) {
+            fReader.ReadSequence();
+        }
+    }
 
     void OnStart(const char* name, const char** attributes) override
     {
@@ -114,9 +119,9 @@ class TEventLog : public IXmlSink {
 
 }  // namespace
 
-TXmlOutcome ReadXml(std::string_view document, std::size_t piece, TXmlReader::EParser parser)
+TXmlOutcome ReadXml(std::string_view document, std::size_t piece, TXmlReader::EParser parser, bool isSequence)
 {
-    TEventLog log(parser);
+    TEventLog log(parser, isSequence);
     log.Read(document, piece);
     return log.TakeOutcome();
 }

@@ -16,8 +16,8 @@ struct TXmlOutcome {
 };
 
 /// Reads the document: whole if `piece` is 0, otherwise in pieces of that many bytes. Half of the pieces' sizes go through the
-/// reader's own buffer.
-TXmlOutcome ReadXml(std::string_view document, std::size_t piece, TXmlReader::EParser parser);
+/// reader's own buffer. `isSequence` says that it may be several documents, one behind the other.
+TXmlOutcome ReadXml(std::string_view document, std::size_t piece, TXmlReader::EParser parser, bool isSequence = false);
 
 /// Loads the document and returns the namespace as a document, or the error with its place. `piece` as for ReadXml.
 std::string LoadXml(std::string_view document, std::size_t piece, TXmlReader::EParser parser);

@@ -27,6 +27,7 @@ TEST(CimXmlWriterTest, SpecialCharactersSurvive)
 TEST(CimXmlWriterTest, TheNamespaceIsNamedIfTheCallerSaysSo)
 {
     TLoading loading;
+    loading.Load(TLoading::Group(TLoading::Class("A")));
     std::string text;
     TCimXmlWriter writer([&](std::string_view piece) { text += piece; });
     writer.WriteNamespace(*loading.GetNamespace(), "root/there");
