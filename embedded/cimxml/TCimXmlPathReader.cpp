@@ -150,6 +150,14 @@ void TCimXmlPathReader::NoteOwnNamespace()
     }
 }
 
+void TCimXmlPathReader::CheckOwnClass(const char* className) const
+{
+    if (HasOwnPath() && !TNameText::Equal(fFrames.front().className, className)) {
+        fContext.Fail(EStatus::kParseError, "found class " + Quote(className) + " behind the name of " +
+                                                Quote(fFrames.front().className) + ", expected the same class in both");
+    }
+}
+
 void TCimXmlPathReader::BeginNamespacePath()
 {
     fNamespaceName.clear();

@@ -48,6 +48,8 @@ class TCimXmlPathReader {
     const std::vector<std::pair<std::string, TCIMValue>>& GetOwnKeys() const noexcept { return fFrames.front().keys; }
     /// Whether there is a name in front of the object that is open.
     bool HasOwnPath() const noexcept { return fDepth > 0 && !fFrames.front().className.empty(); }
+    /// Checks that the name in front of the object, if there is one, is of that class. Errors: kParseError (9) if it is not.
+    void CheckOwnClass(const char* className) const;
     /// Takes the document's namespace from the name in front of the object, if it has one.
     void NoteOwnNamespace();
 

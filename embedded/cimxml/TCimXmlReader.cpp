@@ -245,8 +245,9 @@ void TCimXmlReader::EndObject()
     fPaths.Drop();
 }
 
-/// Call this when a class or an instance starts: a VALUE.OBJECT holds one, and the name in front of it gives the namespace.
-void TCimXmlReader::NoteObject()
+/// Call this when a class or an instance starts: a VALUE.OBJECT holds one, of the class and in the namespace that the name in
+/// front of it says.
+void TCimXmlReader::NoteObject(const char* className)
 {
     if (GetOuterState() != TTable::kObject) {
         return;
@@ -255,12 +256,13 @@ void TCimXmlReader::NoteObject()
         fContext.Fail(EStatus::kParseError, "found a second object where one is expected");
     }
     fIsObjectGiven = true;
+    fPaths.CheckOwnClass(className);
     fPaths.NoteOwnNamespace();
 }
 
 void TCimXmlReader::BeginClass(const TCimXmlAttributes& attributes)
 {
-    NoteObject();
+    NoteObject(attributes.Require("NAME"));
     fDraft.BeginClass(attributes);
 }
 
@@ -276,8 +278,8 @@ void TCimXmlReader::EndClass()
 
 void TCimXmlReader::BeginInstance(const TCimXmlAttributes& attributes)
 {
-    NoteObject();
     const char* name = attributes.Require("CLASSNAME");
+    NoteObject(name);
     fIsDirect = fLoader != nullptr && fLoader->BeginInstance(name);
     fPaths.TakeMetUnsettled();  // what was read in front of the instance is none of its properties
     if (!fIsDirect) {

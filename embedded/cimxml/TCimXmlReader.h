@@ -79,7 +79,7 @@ class TCimXmlReader : public IXmlSink {
 
     void BeginObject();
     void EndObject();
-    void NoteObject();
+    void NoteObject(const char* className);
     void BeginClass(const TCimXmlAttributes& attributes);
     void EndClass();
     void BeginInstance(const TCimXmlAttributes& attributes);

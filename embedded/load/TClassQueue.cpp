@@ -19,34 +19,57 @@ namespace NORVZEL20 {
 
 using EStatus = TZELStatusCode::EStatusCode;
 
+namespace {
+
+/// Whether the namespace declares the class as the draft does, apart from what both inherit.
+bool IsDeclaredSo(const TInMemClass& cls, const TDraft& draft)
+{
+    return TStoredObjects::FromClass(cls) == TStoredObjects::WithoutInherited(draft.object, cls.GetSuperInMemClass().get());
+}
+
+}  // namespace
+
 void TClassQueue::Add(TDraft draft)
 {
-    static constexpr TRepetition kInDocument{"repeated class", " is declared again; the first declaration stands",
-                                             " a second time, declared differently; remove one of the two"};
-    static constexpr TRepetition kInNamespace{"known class", " is in the namespace already, declared the same",
-                                              ", which the namespace declares differently; load into an empty namespace"};
     const std::string& name = draft.object.GetClassName();
     const auto repeated = fNumbers.find(name);
     if (repeated != fNumbers.end()) {
-        return NoteRepeated(name, fEntries[repeated->second].draft.object == draft.object, kInDocument);
+        if (fEntries[repeated->second].draft.object == draft.object) {
+            return NoteRepeated(name);
+        }
+        fRepeated.push_back(std::move(draft));
+        return;
     }
     if (const boost::shared_ptr<TInMemClass> known = fNamespace.FindClass(name)) {
-        const bool isSame =
-            TStoredObjects::FromClass(*known) == TStoredObjects::WithoutInherited(draft.object, known->GetSuperInMemClass().get());
-        return NoteRepeated(name, isSame, kInNamespace);
+        if (!IsDeclaredSo(*known, draft)) {
+            fContext.Fail(EStatus::kAlreadyExists, "found class " + Quote(name) +
+                                                       ", which the namespace declares differently; load into an empty namespace");
+        }
+        return fContext.Tolerate("known class", "class " + Quote(name) + " is in the namespace already, declared the same");
     }
     fNumbers.emplace(name, fEntries.size());
     fEntries.push_back({std::move(draft), kNew});
     ++fContext.GetReport().classes;
 }
 
-void TClassQueue::NoteRepeated(const std::string& name, bool isSame, const TRepetition& repetition)
+void TClassQueue::NoteRepeated(const std::string& name)
 {
-    const std::string shown = "class " + Quote(name);
-    if (!isSame) {
-        fContext.Fail(EStatus::kAlreadyExists, "found " + shown + repetition.conflict);
+    fContext.Tolerate("repeated class", "class " + Quote(name) + " is declared again; the first declaration stands");
+}
+
+/// Whether two declarations say the same can be told when the class has its superclass: one may repeat what it inherits.
+void TClassQueue::CheckRepeated()
+{
+    for (const TDraft& draft : std::exchange(fRepeated, {})) {
+        const TLoadContext::TAt at(fContext, draft.place);
+        const std::string& name = draft.object.GetClassName();
+        if (!IsDeclaredSo(*fNamespace.FindClass(name), draft)) {
+            const TLoadPlace& first = fEntries[fNumbers.find(name)->second].draft.place;
+            fContext.Fail(EStatus::kAlreadyExists, "found class " + Quote(name) + " a second time, declared differently at " +
+                                                       fContext.Describe(first) + "; remove one of the two");
+        }
+        NoteRepeated(name);
     }
-    fContext.Tolerate(repetition.kind, shown + repetition.tolerated);
 }
 
 boost::shared_ptr<TInMemClass> TClassQueue::Find(const char* name)
@@ -194,6 +217,7 @@ void TClassQueue::DeclareAll()
             Refuse(entry.draft);
         }
     }
+    CheckRepeated();
 }
 
 void TClassQueue::MakeDefaultsLocal()

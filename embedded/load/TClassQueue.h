@@ -25,7 +25,8 @@ class CIMDELTA_INTERNAL_EXPORT TClassQueue {
     {}
 
     /// Queues a class. One that is declared already, here or in the namespace, is tolerated and left out if both declarations are
-    /// the same. Errors: kAlreadyExists (12) if they differ.
+    /// the same; what they inherit does not count. Errors: kAlreadyExists (12) if they differ. For two declarations of the load,
+    /// this may turn out only in DeclareAll.
     void Add(TDraft draft);
 
     /// The class of that name, declared now if it is in the queue; null if it or one of its superclasses is not known yet. After
@@ -61,14 +62,8 @@ class CIMDELTA_INTERNAL_EXPORT TClassQueue {
         EState state;
     };
 
-    /// What is said of a class that is declared already: each text follows the class's name.
-    struct TRepetition {
-        const char* kind;       ///< see TLoadContext::Tolerate
-        const char* tolerated;  ///< if both declarations are the same
-        const char* conflict;   ///< if they differ
-    };
-
-    void NoteRepeated(const std::string& name, bool isSame, const TRepetition& repetition);
+    void NoteRepeated(const std::string& name);
+    void CheckRepeated();
     void DeclareQualifiersOfSchema();
     bool TakeFromSchema(const std::string& name);
     bool TakeMissing(const std::string& name);
@@ -83,7 +78,8 @@ class CIMDELTA_INTERNAL_EXPORT TClassQueue {
     TInMemStaging& fStaging;
     std::vector<TEntry> fEntries;    // in the document's order
     TNameMap<std::size_t> fNumbers;  // of the entries, by class name
-    std::size_t fFirstNew = 0;       // entries in front of it have been tried
+    std::vector<TDraft> fRepeated;  // declarations of classes that differ from those in fEntries, perhaps only in what they inherit
+    std::size_t fFirstNew = 0;      // entries in front of it have been tried
     std::size_t fDeclared = 0;
     bool fHasEnded = false;  // all documents have been read
     bool fHasTakenFromSchema = false;

@@ -8,8 +8,10 @@
 
 #include "embedded/load/MessageText.h"
 #include "embedded/store/TReferenceAdapter.h"
+#include "embedded/value/ChangeReferences.h"
 #include "embedded/value/TValueAccess.h"
 #include "embedded/value/TValueText.h"
+#include "host/TCIMReference.h"
 
 namespace NORVZEL20 {
 
@@ -22,6 +24,27 @@ constexpr std::uint32_t kFewInstances = 8;
 std::string Show(const TCIMValue& value)
 {
     return value.IsNull() ? "NULL" : Quote(value.ToText());
+}
+
+/// Takes namespace and host out of a reference, and of those in its keys.
+void DropPlaces(TCIMValue& value)
+{
+    ChangeReferences(value, [](TCIMValue& reference) {
+        TCIMReference path = reference;
+        std::vector<std::pair<std::string, TCIMValue>> keys;
+        path.EnumerateKeyBindings([&keys](const std::pair<std::string, TCIMValue>& key) {
+            keys.push_back(key);
+            return true;
+        });
+        for (auto& [name, key] : keys) {
+            DropPlaces(key);
+            path.AddKeyValue(name, key);
+        }
+        path.SetNamespaceName(std::string());
+        path.SetHost(std::string());
+        reference = TCIMValue(path);
+        return true;
+    });
 }
 
 }  // namespace
@@ -172,30 +195,59 @@ void TInstanceBuilder::FillDefaults()
 
 boost::shared_ptr<TInMemInstance> TInstanceBuilder::Take(const TOwnKeys* ownKeys)
 {
-    if (ownKeys != nullptr && fInstance->FindMissingKey() != nullptr) {
-        FillKeys(*ownKeys);
+    if (ownKeys != nullptr) {
+        UseKeys(*ownKeys);
     }
     fContext.GetTexts().FillRun(nullptr);
     return std::move(fInstance);
 }
 
-/// Takes keys that the instance leaves out from the name in front of it.
-void TInstanceBuilder::FillKeys(const TOwnKeys& keys)
+/// Compares the instance with the name in front of it, and takes keys from there that it leaves out.
+void TInstanceBuilder::UseKeys(const TOwnKeys& keys)
 {
     for (const auto& [name, value] : keys) {
         const std::uint32_t slot = fLayout->cls->GetLayout().FindSlot(name);
-        if (slot == TInMemLayout::kNoSlot || fLayout->targets[slot].given == fNumber) {
+        if (slot == TInMemLayout::kNoSlot || fLayout->targets[slot].isStatic) {
             continue;
         }
-        const TInMemPropertyDecl& decl = fLayout->cls->GetLayout().GetDecl(slot);
-        TCIMValue converted = value;
-        TReferenceAdapter(fNamespace).ConvertKey(decl, value, converted);  // if that fails, SetProperty reports it
-        Localize(converted);  // the name was read before classes in front of it were declared
-        const bool mayRefer =
-            TValueAccess::GetForm(converted) == TValueAccess::kPath || TValueAccess::GetForm(converted) == TValueAccess::kObject;
-        SetProperty(fLayout->targets[slot], std::move(converted), mayRefer);
-        fContext.Tolerate("key from name", "an instance of class " + Quote(fLayout->cls->GetName()) + " leaves out its key " +
-                                               Quote(name) + "; taken from the name in front of it");
+        const TLoadTarget& target = fLayout->targets[slot];
+        if (target.given == fNumber) {
+            CheckKey(target, value);
+        } else if (fInstance->FindMissingKey() != nullptr) {
+            FillKey(target, value);
+        }
+    }
+}
+
+void TInstanceBuilder::FillKey(const TLoadTarget& target, const TCIMValue& value)
+{
+    TCIMValue converted = value;
+    // If that fails, SetProperty reports it.
+    TReferenceAdapter(fNamespace).ConvertKey(fLayout->cls->GetLayout().GetDecl(target.slot), value, converted);
+    Localize(converted);  // the name was read before classes in front of it were declared
+    const bool mayRefer =
+        TValueAccess::GetForm(converted) == TValueAccess::kPath || TValueAccess::GetForm(converted) == TValueAccess::kObject;
+    SetProperty(target, std::move(converted), mayRefer);
+    fContext.Tolerate("key from name", "an instance of class " + Quote(fLayout->cls->GetName()) + " leaves out its key " +
+                                           Quote(*target.name) + "; taken from the name in front of it");
+}
+
+/// References are compared without namespaces and hosts: which of them are the document's own may not be known yet.
+void TInstanceBuilder::CheckKey(const TLoadTarget& target, const TCIMValue& value)
+{
+    TCIMValue there = fInstance->GetSlotValue(target.slot);
+    if (there.IsNull() || (there.GetType() == value.GetType() && there.IsSameKey(value))) {
+        return;
+    }
+    TCIMValue converted = value;
+    TReferenceAdapter(fNamespace).ConvertKey(fLayout->cls->GetLayout().GetDecl(target.slot), value, converted);
+    TReferenceAdapter(fNamespace).Adapt(converted);
+    DropPlaces(converted);
+    DropPlaces(there);
+    if (!there.IsSameKey(converted)) {
+        fContext.Fail(EStatus::kParseError, "found " + Show(there) + " in the key " + Quote(*target.name) +
+                                                " of an instance of class " + Quote(fLayout->cls->GetName()) +
+                                                ", but the name in front of it says " + Show(value) + "; correct one of the two");
     }
 }
 

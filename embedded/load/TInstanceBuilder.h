@@ -57,7 +57,8 @@ class TInstanceBuilder {
     /// Begins the instance and sets all its properties. Call it for a draft when the document has ended. Errors: kNotFound (15) if
     /// its class is not declared; those of FindProperty and SetProperty.
     void Fill(const TDraft& draft, const TReadObjects& readObjects);
-    /// Ends the instance. `ownKeys` (may be null) are the keys of the name in front of it, for those that it leaves out.
+    /// Ends the instance. `ownKeys` (may be null) are the keys of the name in front of it, for those that it leaves out. Errors:
+    /// kParseError (9) if the instance has another value there.
     boost::shared_ptr<TInMemInstance> Take(const TOwnKeys* ownKeys);
 
     /// Whether the instances of the last instance's class are held; see TLateInstances::Hold.
@@ -79,7 +80,9 @@ class TInstanceBuilder {
     TCIMValue Convert(const TLoadTarget& target, const TCIMValue& value);
     bool Localize(TCIMValue& value) const;
     void FillDefaults();
-    void FillKeys(const TOwnKeys& keys);
+    void UseKeys(const TOwnKeys& keys);
+    void FillKey(const TLoadTarget& target, const TCIMValue& value);
+    void CheckKey(const TLoadTarget& target, const TCIMValue& value);
 
     TLoadContext& fContext;
     TInMemNamespace& fNamespace;

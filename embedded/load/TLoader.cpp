@@ -11,6 +11,7 @@
 //    which those of the drafts belong by now, are added. What is still missing then is an error.
 #include "embedded/load/TLoader.h"
 
+#include <algorithm>
 #include <boost/smart_ptr/make_shared.hpp>
 #include <utility>
 
@@ -22,9 +23,8 @@ namespace NORVZEL20 {
 using EStatus = TZELStatusCode::EStatusCode;
 
 TLoader::TLoader(TLoadContext& context, const boost::shared_ptr<TInMemNamespace>& ns)
-    : fContext(context), fNamespace(ns), fStaging(ns), fClasses(context, *ns, fStaging),
+    : fContext(context), fNamespace(ns), fStaging(ns), fClasses(context, *ns, fStaging), fRepeats(context),
       fBuilder(context, *ns, fStaging, fClasses, fLate)
-
 {
     if (fContext.GetOptions().takesDeclarationsOnly) {
         fLate.StartWaiting();  // so that all instances come to AddInstance
@@ -84,8 +84,12 @@ void TLoader::Add(const boost::shared_ptr<TInMemInstance>& instance)
     try {
         fStaging.AddInstance(instance);
     } catch (const TZELException& error) {
-        Explain(error, *instance);
+        if (error.GetStatusCode().GetStatus() != EStatus::kAlreadyExists) {
+            Explain(error, *instance);
+        }
+        return fRepeats.NoteRepeated(instance);
     }
+    fRepeats.NoteAdded(*instance->GetInMemClass(), fContext.GetPlace());
 }
 
 /// The namespace says what it refuses; the message of a load also says what to do.
@@ -93,12 +97,6 @@ void TLoader::Explain(const TZELException& error, const TInMemInstance& instance
 {
     const EStatus status = error.GetStatusCode().GetStatus();
     const std::string ofClass = " of class " + Quote(instance.GetInMemClass()->GetName());
-    if (status == EStatus::kAlreadyExists) {
-        constexpr std::size_t kLongestPath = 200;
-        const std::string path = instance.GetReference().ToText();
-        fContext.Fail(status, "found a second instance " + (path.size() > kLongestPath ? Quote(path) : path) + "; instances" +
-                                  ofClass + " must differ in their keys");
-    }
     if (status == EStatus::kKeyMissing) {
         fContext.Fail(status, "found an instance" + ofClass + " without a value for its key " + Quote(*instance.FindMissingKey()) +
                                   "; every key needs one");
@@ -115,6 +113,7 @@ void TLoader::Fill(const TDraft& draft, const TReadObjects& readObjects)
 
 void TLoader::FillInstance(TDraft draft, const TReadObjects& readObjects)
 {
+    fContext.GetContents().NoteObject();
     if (fLate.IsWaiting()) {
         AddInstance(std::move(draft));
     } else {
@@ -124,6 +123,7 @@ void TLoader::FillInstance(TDraft draft, const TReadObjects& readObjects)
 
 void TLoader::AddInstance(TDraft draft)
 {
+    fContext.GetContents().NoteObject();
     if (!fContext.GetOptions().takesDeclarationsOnly) {
         fLate.Wait(std::move(draft));
     }
@@ -179,6 +179,20 @@ void TLoader::Finish(const TReadObjects& readObjects)
     for (const TLateInstances::THeld& held : fLate.TakeHeld()) {
         const TLoadContext::TAt at(fContext, held.place);
         Add(held.instance);
+    }
+    DropRepeated();
+}
+
+/// Instances that came twice count once.
+void TLoader::DropRepeated()
+{
+    fRepeats.Check();
+    fContext.GetReport().instances -= fRepeats.GetCount();
+    if (fRepeats.GetCount() > 0 && fKeep) {
+        const auto isRepeated = [this](const boost::shared_ptr<ICIMElement>& kept) {
+            return fRepeats.Has(static_cast<const TInMemInstance&>(*kept));
+        };
+        fKeptInstances.erase(std::remove_if(fKeptInstances.begin(), fKeptInstances.end(), isRepeated), fKeptInstances.end());
     }
 }
 

@@ -11,6 +11,7 @@
 #include "embedded/load/TLateInstances.h"
 #include "embedded/load/TLoadContext.h"
 #include "embedded/load/TQualifierDraft.h"
+#include "embedded/load/TRepeatedInstances.h"
 #include "embedded/store/TInMemNamespace.h"
 #include "embedded/store/TInMemStaging.h"
 #include "host/Export.h"
@@ -47,8 +48,9 @@ class CIMDELTA_INTERNAL_EXPORT TLoader {
     {
         fBuilder.SetProperty(target, std::move(value), isUnsettled);
     }
-    /// `ownKeys` (may be null) gives the keys that the instance itself leaves out. Errors: kAlreadyExists (12) if an instance with
-    /// these keys is there, kKeyMissing (14) if a key has no value.
+    /// `ownKeys` (may be null) gives the keys of the name in front of the instance; it may leave them out itself. Errors:
+    /// kAlreadyExists (12) if an instance with these keys was there before the load, kKeyMissing (14) if a key has no value,
+    /// kParseError (9) if a key has another value than the name says.
     void EndInstance(const TOwnKeys* ownKeys);
     void AddInstance(TDraft draft);
     /// As AddInstance, but does not let the instance wait if no other does. Call it after DeclareClasses. Errors: as Finish.
@@ -60,8 +62,8 @@ class CIMDELTA_INTERNAL_EXPORT TLoader {
     /// Declares the classes that wait. Call it at the end of the documents, if something needs the classes before Finish. Errors:
     /// as Finish.
     void DeclareClasses() { fClasses.DeclareAll(); }
-    /// Adds what waits. Call it at the end of the document. Errors: kNotFound (15) for a class that never came, and those of the
-    /// others.
+    /// Adds what waits. Call it at the end of the documents. Errors: kNotFound (15) for a class that never came, kAlreadyExists
+    /// (12) if a class or an instance came twice with different contents, and those of the others.
     void Finish(const TReadObjects& readObjects);
     /// Keeps what was added.
     void Commit() noexcept;
@@ -79,6 +81,7 @@ class CIMDELTA_INTERNAL_EXPORT TLoader {
     void InferClasses();
     void DeclareQualifier(const TQualifierDraft& draft);
     void Add(const boost::shared_ptr<TInMemInstance>& instance);
+    void DropRepeated();
     [[noreturn]] void Explain(const TZELException& error, const TInMemInstance& instance) const;
 
     TLoadContext& fContext;
@@ -86,6 +89,7 @@ class CIMDELTA_INTERNAL_EXPORT TLoader {
     TInMemStaging fStaging;
     TClassQueue fClasses;
     TLateInstances fLate;
+    TRepeatedInstances fRepeats;
     TInstanceBuilder fBuilder;
     bool fHasEnded = false;  // the document: instances are held until it is decided which references are local
     TOwnPlace fOwnPlace;     // of the document, when it has ended

@@ -266,15 +266,18 @@ TEST_F(BadInputTest, BracketsAreNoList)
 
 TEST_F(BadInputTest, ALongKeyMakesNoLongMessage)
 {
-    const std::string instance = "<VALUE.OBJECT><INSTANCE CLASSNAME='A'><PROPERTY NAME='Id' TYPE='string'><VALUE>" +
-                                 std::string(1000000, 'k') + "</VALUE></PROPERTY></INSTANCE></VALUE.OBJECT>";
+    const auto instance = [](const std::string& number) {
+        return "<VALUE.OBJECT><INSTANCE CLASSNAME='A'><PROPERTY NAME='Id' TYPE='string'><VALUE>" + std::string(1000000, 'k') +
+               "</VALUE></PROPERTY><PROPERTY NAME='N' TYPE='uint8'><VALUE>" + number +
+               "</VALUE></PROPERTY></INSTANCE></VALUE.OBJECT>";
+    };
     const std::string inventory =
         Scratch("long", "<CIM CIMVERSION='2.0' DTDVERSION='2.0'><DECLARATION><DECLGROUP><VALUE.OBJECT><CLASS NAME='A'>"
                         "<PROPERTY NAME='Id' TYPE='string'><QUALIFIER NAME='Key' TYPE='boolean'><VALUE>true</VALUE></QUALIFIER>"
-                        "</PROPERTY></CLASS></VALUE.OBJECT>\n" +
-                            instance + "\n" + instance + "</DECLGROUP></DECLARATION></CIM>");
-    EXPECT_EQ("cimdelta: I:3:1000099: found a second instance \"root/cimv2:A.Id=\"" + std::string(63, 'k') +
-                  "...\"; instances of class \"A\" must differ in their keys\n",
+                        "</PROPERTY><PROPERTY NAME='N' TYPE='uint8'/></CLASS></VALUE.OBJECT>\n" +
+                            instance("1") + "\n" + instance("2") + "</DECLGROUP></DECLARATION></CIM>");
+    EXPECT_EQ("cimdelta: I:3:1000156: found a second instance \"root/cimv2:A.Id=\"" + std::string(63, 'k') +
+                  "...\" with \"2\" in property \"N\", but the one at I:2:1000156 has \"1\"; remove one of the two\n",
               Shorten(Complaint({"show", inventory}), inventory, "I"));
 }
 

@@ -70,8 +70,13 @@ const TBadInputRow kRows[] = {
      "doc.xml:2:15: found class \"A\" with the superclass \"a\", which leads back to it or to a class that is not declared"},
     {"unknown property", L::Group(ClassWithCounter() + L::Instance("A", "1", L::Property("M", "uint8", "1"))), 15,
      "doc.xml:3:100: found property \"M\", but class \"A\" declares no such property; add its declaration or correct the name"},
-    {"second instance", L::Group(ClassWithCounter() + L::Instance("A", "1") + L::Instance("A", "1")), 12,
-     "doc.xml:4:100: found a second instance root/cimv2:A.Id=\"1\"; instances of class \"A\" must differ in their keys"},
+    {"second instance",
+     L::Group(ClassWithCounter() + L::Instance("A", "1") + L::Instance("A", "1", L::Property("N", "uint8", "3"))), 12,
+     "doc.xml:4:159: found a second instance root/cimv2:A.Id=\"1\" with \"3\" in property \"N\", but the one at doc.xml:3:100 has"
+     " NULL; remove one of the two"},
+    {"second instance without a key", L::Group("<CLASS NAME=\"B\"/><INSTANCE CLASSNAME=\"B\"/><INSTANCE CLASSNAME=\"B\"/>"), 12,
+     "doc.xml:2:68: found a second instance of class \"B\", which has no key to tell them apart; give its whole declaration, with"
+     " the qualifiers and those of its superclasses"},
     {"key without value", L::Group(ClassWithCounter() + "<INSTANCE CLASSNAME=\"A\"/>"), 14,
      "doc.xml:3:26: found an instance of class \"A\" without a value for its key \"Id\"; every key needs one"},
     {"value out of range", L::Group(ClassWithCounter() + L::Instance("A", "1", L::Property("N", "uint8", "300"))), 13,
@@ -83,7 +88,7 @@ const TBadInputRow kRows[] = {
     {"value twice", L::Group(L::Class("A", "<PROPERTY NAME=\"N\" TYPE=\"uint8\"><VALUE>1</VALUE><VALUE>2</VALUE></PROPERTY>")), 9,
      "doc.xml:2:212: found a second value for \"N\", expected one"},
     {"class twice, differing", L::Group(L::Class("A") + ClassWithCounter()), 12,
-     "doc.xml:3:15: found class \"A\" a second time, declared differently; remove one of the two"},
+     "doc.xml:3:15: found class \"A\" a second time, declared differently at doc.xml:2:15; remove one of the two"},
     {"recorded error", "<CIM><MESSAGE><SIMPLERSP><IMETHODRESPONSE><ERROR CODE=\"6\" DESCRIPTION=\"gone\"/>", 9,
      "doc.xml:1:43: found an error as the answer: CIM_ERR_NOT_FOUND (6), \"gone\"; expected an answer with objects, so ask the "
      "server again"},

@@ -72,6 +72,7 @@ TEST(FormsTest, EachFormOfDeclarationsAndInstancesLoads)
         {"declarations.xml sections.xml", "1 classes, 3 instances"},
         {"declarations.xml instance-names.xml enumerate-instances.xml", "1 classes, 2 instances"},
         {"qualifiers.xml", "0 classes, 0 instances"},
+        {"several-answers.xml instances.xml named-instances.xml", "1 classes, 2 instances"},
     };
     for (const TFormRow& row : rows) {
         EXPECT_EQ(row.outcome, Outcome(row.files)) << row.files;
@@ -120,6 +121,9 @@ TEST(FormsTest, WhatIsNoInventoryIsRefusedForWhatItIs)
         {"declarations.xml pull-last.xml pull.xml",
          "pull.xml:3:12: found an answer to \"PullInstancesWithPath\" that does not end its sequence (EndOfSequence is not TRUE), "
          "but not the ones after it; pull until the end, and load all the answers together"},
+        {"declarations.xml open-whole.xml open.xml",
+         "open.xml:3:12: found an answer to \"OpenEnumerateInstances\" that does not end its sequence (EndOfSequence is not TRUE), "
+         "but not the ones after it; pull until the end, and load all the answers together"},
     };
     for (const TFormRow& row : rows) {
         EXPECT_EQ(row.outcome, Outcome(row.files)) << row.files;
@@ -133,6 +137,12 @@ TEST(FormsTest, OtherFilesAreRefusedWithTheirPlace)
                           "was cut off: fetch or write it again"},
         {"page.html", "page.html:2:1: found element <html> as the outermost element, expected <CIM>, or a part of it such as "
                       "<IRETURNVALUE>, <INSTANCE> or <CLASS>"},
+        {"several-answers.xml truncated.xml", "truncated.xml:19:1: found malformed XML: unclosed token; the document ends within "
+                                              "<IRETURNVALUE>, so it was cut off: fetch or write it again"},
+        {"declarations.xml other-class.xml",
+         "other-class.xml:4:1: found class \"Disk\" behind the name of \"Device\", expected the same class in both"},
+        {"declarations.xml other-name.xml", "other-name.xml:7:1: found \"sda\" in the key \"Id\" of an instance of class \"Disk\", "
+                                            "but the name in front of it says \"sdb\"; correct one of the two"},
     };
     for (const TFormRow& row : rows) {
         EXPECT_EQ(row.outcome, Outcome(row.files)) << row.files;

@@ -14,7 +14,7 @@ namespace {
 
 using EParser = TXmlReader::EParser;
 
-constexpr std::size_t kLongestPiece = 37;
+constexpr std::size_t kLongestSequencePiece = 37;
 
 std::string ReadWhole(const std::string& text)
 {
@@ -70,7 +70,7 @@ TEST(SequenceTest, EachDocumentIsReadAndLinesGoOn)
 TEST(SequenceTest, BothParsersReadTheSameInAnyPieces)
 {
     for (const TSequenceRow& row : GetRows()) {
-        for (std::size_t piece = 0; piece <= kLongestPiece; ++piece) {
+        for (std::size_t piece = 0; piece <= kLongestSequencePiece; ++piece) {
             EXPECT_EQ(ReadXml(row.text, piece, EParser::kExpat, true).events,
                       ReadXml(row.text, piece, EParser::kTokenizer, true).events)
                 << row.what << " in pieces of " << piece;
@@ -86,7 +86,7 @@ TEST(SequenceTest, MutatedSequencesReadTheSame)
         const std::string& first = GetRows()[random() % GetRows().size()].text;
         const std::string& second = GetRows()[random() % GetRows().size()].text;
         const std::string text = MutateXml(first + second, random);
-        for (const std::size_t piece : {std::size_t{0}, 1 + random() % kLongestPiece}) {
+        for (const std::size_t piece : {std::size_t{0}, 1 + random() % kLongestSequencePiece}) {
             const std::string expected = ReadXml(text, piece, EParser::kExpat, true).events;
             EXPECT_EQ(expected, ReadXml(text, piece, EParser::kTokenizer, true).events) << number << ": " << text;
             read += expected.find("not read") == std::string::npos ? 1 : 0;

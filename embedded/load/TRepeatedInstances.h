@@ -1,0 +1,60 @@
+#pragma once
+
+#include <boost/smart_ptr/shared_ptr.hpp>
+#include <cstdint>
+#include <optional>
+#include <unordered_map>
+#include <vector>
+
+#include "embedded/load/TLoadContext.h"
+#include "embedded/store/TInMemInstance.h"
+
+namespace NORVZEL20 {
+
+/// Instances that a load has twice. If both have the same values, they are one, which is tolerated; otherwise they contradict each
+/// other. Values are compared at the end, because references may be written again until then.
+///
+/// Memory: 12 bytes for each instance of the load. Cost: constant for each operation but Check and what fails.
+class TRepeatedInstances {
+  public:
+    explicit TRepeatedInstances(TLoadContext& context) noexcept : fContext(context) {}
+
+    /// The load has added an instance of that class, the next one of its extent, which is at `place`.
+    void NoteAdded(const TInMemClass& cls, const TLoadPlace& place);
+    /// The instance at the current place has the keys of another one of its class, which was added before. Errors: fails with
+    /// kAlreadyExists (12) if that was there before the load, or if the class has no keys.
+    void NoteRepeated(const boost::shared_ptr<TInMemInstance>& repeated);
+    /// Compares what was noted. Errors: fails with kAlreadyExists (12) if one has other values than the instance added first.
+    void Check();
+
+    /// Those that were noted, in the order of the documents.
+    bool Has(const TInMemInstance& instance) const noexcept;
+    std::size_t GetCount() const noexcept { return fRepeats.size(); }
+
+  private:
+    struct TPlace {
+        std::uint32_t document;
+        std::uint32_t line;
+        std::uint32_t column;
+    };
+    struct TPlaces {
+        std::size_t before = 0;  // instances in the extent, from earlier loads
+        std::vector<TPlace> places;
+    };
+    struct TRepeat {
+        boost::shared_ptr<TInMemInstance> first;
+        boost::shared_ptr<TInMemInstance> repeated;
+        TLoadPlace place;
+    };
+
+    std::optional<TLoadPlace> FindPlace(const TInMemInstance& instance) const;
+    void Compare(const TRepeat& repeat);
+
+    TLoadContext& fContext;
+    std::unordered_map<const TInMemClass*, TPlaces> fPlaces;
+    const TInMemClass* fLastClass = nullptr;
+    TPlaces* fLast = nullptr;  // of that class
+    std::vector<TRepeat> fRepeats;
+};
+
+}  // namespace NORVZEL20
