@@ -64,8 +64,7 @@ const TBadInputRow kRows[] = {
     {"unknown class", L::Group(ClassWithCounter() + L::Instance("B", "1")), 15,
      "doc.xml:3:15: found an instance of class \"B\", which is not declared; give its declaration"},
     {"unknown superclass", L::Group("<VALUE.OBJECT><CLASS NAME=\"A\" SUPERCLASS=\"B\"/></VALUE.OBJECT>"), 15,
-     "doc.xml:2:15: found class \"A\" with the superclass \"B\", which is not declared; add its <CLASS> to the document or load it "
-     "before"},
+     "doc.xml:2:15: found class \"A\" with the superclass \"B\", which is not declared; give its declaration"},
     {"class below itself", L::Group("<VALUE.OBJECT><CLASS NAME=\"A\" SUPERCLASS=\"a\"/></VALUE.OBJECT>"), 15,
      "doc.xml:2:15: found class \"A\" with the superclass \"a\", which leads back to it or to a class that is not declared"},
     {"unknown property", L::Group(ClassWithCounter() + L::Instance("A", "1", L::Property("M", "uint8", "1"))), 15,
