@@ -14,7 +14,7 @@ namespace NORVZEL20 {
 
 namespace {
 
-const char kInventoryHelp[] = "[LABEL=]SOURCE[,SOURCE...]; a source is a file of CIM-XML, plain or compressed with gzip, xz or "
+const char kInventoryHelp[] = "[LABEL=]SOURCE[,SOURCE...]; a source is a file of CIM-XML or MOF, plain or compressed with gzip, xz or "
                               "zstd, a folder of such files, or - "
                               "for standard input";
 

@@ -99,6 +99,7 @@ TComparisonReport TComparison::RunWith(const std::shared_ptr<TRules>& rules, con
     for (const TInventory& inventory : fInventories) {
         report.labels.push_back(inventory.label);
         report.paths.push_back(inventory.path);
+        report.loads.push_back(inventory.loaded);
     }
     report.coverage = TCoverageBuilder(fInventories, *rules, fNotes).Build();
     report.idleRules = text.isMade ? std::vector<std::string>() : FindIdleRules(rules->GetDocument());

@@ -7,6 +7,7 @@
 
 #include "client/comparison/TCoverage.h"
 #include "client/comparison/TDifferenceList.h"
+#include "embedded/load/TLoadReport.h"
 #include "provider/TDeltaNamespace.h"
 
 namespace NORVZEL20 {
@@ -15,6 +16,7 @@ namespace NORVZEL20 {
 struct TComparisonReport {
     std::vector<std::string> labels;  ///< of the inventories; the first one is the reference
     std::vector<std::string> paths;   ///< of the inventories, in the same order
+    std::vector<TLoadReport> loads;   ///< what was found when they were loaded, in the same order
     TCoverage coverage;
     std::vector<std::string> idleRules;  ///< the classes that a rules file names although no inventory has instances of their trees
     boost::shared_ptr<TDeltaNamespace> records;    ///< the delta namespace of the run

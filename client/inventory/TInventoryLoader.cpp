@@ -19,6 +19,7 @@
 #include "client/inventory/LoadFiles.h"
 #include "client/inventory/LoadSchema.h"
 #include "client/inventory/MakeLoadOptions.h"
+#include "client/inventory/SayNamespaceDoubts.h"
 #include "client/process/TProgress.h"
 #include "client/process/TSignalsHeld.h"
 
@@ -121,8 +122,9 @@ std::vector<TInventory> TInventoryLoader::Load(const std::vector<TInventorySourc
         const TProgress progress(fConsole, sources.size() == 1 ? "loading the inventory" : "loading the inventories");
         TParallelLoad(inventories, options).Run();
     }
-    for (const TInventory& inventory : inventories) {
-        SayTolerated(inventory.loaded, fConsole);
+    for (std::size_t i = 0; i < inventories.size(); ++i) {
+        SayTolerated(inventories[i].loaded, fConsole);
+        SayNamespaceDoubts(inventories[i], options[i].namespaceName, fConsole);
     }
     return inventories;
 }

@@ -89,7 +89,8 @@ std::string WriteDocuments(const TJson& documents, EOutputFormat format)
 std::string NamespaceNameOf(const TInventory& inventory)
 {
     const TLoadReport& loaded = inventory.loaded;
-    return loaded.namesNamespace || loaded.referencesNameNamespace ? loaded.namespaceName : std::string();
+    return loaded.namespaceOrigin != TLoadReport::kFromDefault || loaded.referencesNameNamespace ? loaded.namespaceName
+                                                                                                 : std::string();
 }
 
 // Superclasses first, each once: a document declares a class before those below it.

@@ -24,6 +24,7 @@
 #include "client/report/JsonDifference.h"
 #include "client/report/JsonValue.h"
 #include "client/report/TJsonDocument.h"
+#include "embedded/load/TLoadReport.h"
 
 namespace NORVZEL20 {
 
@@ -44,6 +45,29 @@ TJson JsonOfSummary(const TComparisonReport& report)
             {"nothingCompared", report.coverage.IsNothingCompared()}};
 }
 
+const char* NamespaceOrigin(TLoadReport::ENamespaceOrigin origin)
+{
+    switch (origin) {
+    case TLoadReport::kFromDocuments:
+        return "document";
+    case TLoadReport::kFromReferences:
+        return "references";
+    case TLoadReport::kFromOptions:
+        return "option";
+    default:
+        return "default";
+    }
+}
+
+TJson JsonOfInferred(const TLoadReport& loaded)
+{
+    TJson classes = TJson::array();
+    for (const TLoadReport::TInferred& inferred : loaded.inferred) {
+        classes.push_back({{"class", inferred.className}, {"keys", inferred.keys}});
+    }
+    return classes;
+}
+
 TJson JsonOfInventories(const TComparisonReport& report)
 {
     TJson inventories = TJson::array();
@@ -51,7 +75,10 @@ TJson JsonOfInventories(const TComparisonReport& report)
         inventories.push_back({{"label", report.labels[i]},
                                {"file", report.paths[i]},
                                {"role", i == 0 ? "reference" : "other"},
-                               {"instancesCompared", report.coverage.CountCompared(i)}});
+                               {"instancesCompared", report.coverage.CountCompared(i)},
+                               {"namespace", report.loads[i].namespaceName},
+                               {"namespaceFrom", NamespaceOrigin(report.loads[i].namespaceOrigin)},
+                               {"inferredClasses", JsonOfInferred(report.loads[i])}});
     }
     return inventories;
 }

@@ -42,6 +42,8 @@ class TStatement {
         WriteSharing();
         WriteReferences();
         WriteNotes();
+        WriteNamespaces();
+        WriteInferred();
         return fOut;
     }
 
@@ -202,6 +204,37 @@ class TStatement {
         for (const auto& entry : declared) {
             fOut += "Declared in " + Label(entry.first.first) + " as in " + Label(entry.first.second) + ": " +
                     EscapeForDisplay(SomeOf(entry.second)) + ".\n";
+        }
+    }
+
+    // A namespace matters if references name one; that which a document names itself needs no words.
+    void WriteNamespaces()
+    {
+        for (std::size_t i = 0; i < fReport.loads.size(); ++i) {
+            const TLoadReport& loaded = fReport.loads[i];
+            const bool isFromOptions = loaded.namespaceOrigin == TLoadReport::kFromOptions;
+            if (isFromOptions || !loaded.namespacesOfReferences.empty()) {
+                fOut += "Namespace of " + Label(i) + ": " + EscapeForDisplay(loaded.namespaceName) +
+                        (isFromOptions                                            ? ", as --namespace says"
+                         : loaded.namespaceOrigin == TLoadReport::kFromReferences ? ", the one that its references name"
+                                                                                  : ", since its references name several") +
+                        ".\n";
+            }
+        }
+    }
+
+    void WriteInferred()
+    {
+        for (std::size_t i = 0; i < fReport.loads.size(); ++i) {
+            std::vector<std::string> classes;
+            for (const TLoadReport::TInferred& inferred : fReport.loads[i].inferred) {
+                classes.push_back(inferred.className + " (" +
+                                  (inferred.keys.empty() ? "no keys" : boost::algorithm::join(inferred.keys, ", ")) + ")");
+            }
+            if (!classes.empty()) {
+                fOut +=
+                    "Inferred in " + Label(i) + " from instances, with their keys: " + EscapeForDisplay(SomeOf(classes)) + ".\n";
+            }
         }
     }
 

@@ -27,19 +27,17 @@ namespace NORVZEL20 {
 /// cannot be confused with the punctuation of a path.
 /// Values: a property that an instance does not mention is null, even if it has a default.
 /// References: one without a namespace, or to the document's own namespace and host, is stored without both; letter case, and
-/// slashes at both ends of the name, do not count. If the document names no namespace, its own is the one that all its references
-/// name, otherwise root/cimv2. If it names no host, its own is the one that its references name beside that namespace; if they
-/// name several, none is its own, and all are kept. A reference that names no host is to the own one.
-/// All or nothing: if a load throws, the namespace is as it was.
-/// Errors of every load: TPopulateError with the statuses of TNamespacePopulator::PopulateFromXMLFile, or kNotSupported (31) if the
-/// namespace is not one of the provider "inmem"; std::bad_alloc. Nothing is logged.
-/// Threads: use a populator, and a namespace, from one thread at a time; different populators may load into different namespaces
-/// concurrently.
-/// Cost: one pass over the document, which is never held whole.
-/// Bounds: a document that exceeds one is refused with kParseError (9). They are those of TXmlLimits; 1000 superclasses of a class;
-/// 1024 properties of a class, an instance or an embedded object; 1024 methods of a class; 1024 qualifiers of an element; 256 key
-/// bindings of a path; 12 paths and 32 embedded objects inside of each other. Inherited parts count. An embedded object with a
-/// document type declaration is refused with kTypeMismatch (13).
+/// slashes at both ends of the name, do not count. If the document names no namespace, its own is the one that all those of its
+/// references name that name any, otherwise root/cimv2. If it names no host, its own is the one that its references name beside
+/// that namespace; if they name several, none is its own, and all are kept. A reference that names no host is to the own one. All
+/// or nothing: if a load throws, the namespace is as it was. Errors of every load: TPopulateError with the statuses of
+/// TNamespacePopulator::PopulateFromXMLFile, or kNotSupported (31) if the namespace is not one of the provider "inmem";
+/// std::bad_alloc. Nothing is logged. Threads: use a populator, and a namespace, from one thread at a time; different populators
+/// may load into different namespaces concurrently. Cost: one pass over the document, which is never held whole. Bounds: a document
+/// that exceeds one is refused with kParseError (9). They are those of TXmlLimits; 1000 superclasses of a class; 1024 properties of
+/// a class, an instance or an embedded object; 1024 methods of a class; 1024 qualifiers of an element; 256 key bindings of a path;
+/// 12 paths and 32 embedded objects inside of each other. Inherited parts count. An embedded object with a document type
+/// declaration is refused with kTypeMismatch (13).
 class CIMDELTA_EXPORT TCimXmlPopulator {
   public:
     using TPullSource = TCimXmlDocuments::TPullSource;

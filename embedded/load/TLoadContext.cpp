@@ -19,6 +19,7 @@ TLoadContext::TLoadContext(TLoadOptions options) : fOptions(std::move(options))
     const std::string_view name = Trim(fOptions.namespaceName, "/");
     if (!name.empty()) {
         fReport.namespaceName = name;
+        fReport.namespaceOrigin = TLoadReport::kFromOptions;
     }
 }
 
@@ -88,6 +89,7 @@ void TLoadContext::NoteNamespace(const std::string& name, const std::string& hos
 {
     if (!fReport.namesNamespace) {
         fReport.namesNamespace = true;
+        fReport.namespaceOrigin = TLoadReport::kFromDocuments;
         fReport.namespaceName = name;
     }
     if (!TNameText::Equal(name, fReport.namespaceName)) {

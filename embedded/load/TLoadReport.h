@@ -16,14 +16,25 @@ struct TLoadReport {
         std::size_t count;     ///< how many of this kind there were
     };
 
+    /// What the namespace was taken from.
+    enum ENamespaceOrigin {
+        kFromDocuments,   ///< they name it themselves
+        kFromReferences,  ///< all references that name a namespace name this one
+        kFromOptions,     ///< TLoadOptions::namespaceName
+        kFromDefault      ///< nothing tells
+    };
+
     /// A class that was declared as its instances suggest.
     struct TInferred {
         std::string className;
         std::vector<std::string> keys;
     };
 
-    /// The namespace that the document names; if it names none, the one that all its references name, otherwise this default.
+    /// The namespace that the documents name; if they name none, see TOwnPlaceSearch.
     std::string namespaceName = "root/cimv2";
+    ENamespaceOrigin namespaceOrigin = kFromDefault;
+    /// If the documents do not name their namespace: those that references name, in ascending order.
+    std::vector<std::string> namespacesOfReferences;
     bool namesNamespace = false;           ///< whether the document names its namespace
     bool referencesNameNamespace = false;  ///< whether namespace or host had to be found out from the references
     std::string host;                      ///< the host beside that namespace; empty if none is named

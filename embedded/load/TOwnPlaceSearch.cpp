@@ -4,8 +4,8 @@
 // of their namespace or host differs. Which namespace that is, the document may say itself, before its first object, in the middle
 // or never; and it may name the namespace without the host. What it does not say follows from its references:
 //
-//     namespace   the one that all of them name, otherwise root/cimv2. If some name one and others none, it is a foreign one: who
-//                 leaves the own namespace out of one reference leaves it out of all
+//     namespace   the one that all of those name which name any: some writers leave it out of a reference here and there. If they
+//                 name several, the one that the options of the load give, otherwise root/cimv2
 //     host        the one that all of those name which name one beside that namespace; if they name several, none is known to be
 //                 the own one, and all stay in the paths
 //
@@ -21,7 +21,6 @@ namespace NORVZEL20 {
 TOwnPlaceSearch::EAnswer TOwnPlaceSearch::Classify(const std::string& name, const std::string& host)
 {
     if (name.empty()) {
-        fIsNameless = true;
         return kForeign;
     }
     // What the document has named itself does not change any more.
@@ -75,8 +74,14 @@ bool TOwnPlaceSearch::MakePathLocal(TCIMValue& value, bool& isOpen)
 void TOwnPlaceSearch::Decide()
 {
     fReport.referencesNameNamespace = HasOpen();
-    if (!fReport.namesNamespace && fNamed.size() == 1 && !fIsNameless) {
-        fReport.namespaceName = fNamed.begin()->first;
+    if (!fReport.namesNamespace) {
+        for (const auto& named : fNamed) {
+            fReport.namespacesOfReferences.push_back(named.first);
+        }
+        if (fNamed.size() == 1) {
+            fReport.namespaceName = fNamed.begin()->first;
+            fReport.namespaceOrigin = TLoadReport::kFromReferences;
+        }
     }
     const auto own = fNamed.find(fReport.namespaceName);
     fIsAnyHostOwn = fReport.host.empty() && (own == fNamed.end() || !own->second.areSeveral);

@@ -51,8 +51,7 @@ class CIMDELTA_INTERNAL_EXPORT TOwnPlaceSearch {
     bool MakePathLocal(TCIMValue& value, bool& isOpen);
 
     TLoadReport& fReport;
-    TNameMap<THosts> fNamed;   // by namespace
-    bool fIsNameless = false;  // a reference names no namespace
+    TNameMap<THosts> fNamed;  // by namespace
     bool fIsDecided = false;
     bool fIsAnyHostOwn = false;  // the references name one host at most, and the document names none
 };

@@ -1,3 +1,4 @@
+#include <nlohmann/json.hpp>
 #include <sstream>
 
 #include "tests/client/Documents.h"
@@ -33,7 +34,9 @@ class NamespaceTest : public TClientFixture {
     {
         std::vector<std::string> arguments = {"query", "SELECT To FROM Link", file};
         arguments.insert(arguments.end(), options.begin(), options.end());
-        std::istringstream lines(Result(arguments));
+        Run(arguments);
+        EXPECT_EQ(0, fStatus) << fErr;
+        std::istringstream lines(fOut);
         std::string targets;
         for (std::string line; std::getline(lines, line);) {
             targets += line.rfind("    To: ", 0) == 0 ? "To " + line.substr(8) + "\n" : "";
@@ -48,9 +51,69 @@ TEST_F(NamespaceTest, TheOptionDecidesIfReferencesNameSeveral)
     EXPECT_EQ("To root/hw:Disk.Id=\"sda\"\n"
               "To root/sw:Disk.Id=\"sdb\"\n",
               Targets(file));
+    EXPECT_EQ("cimdelta: a: names no namespace, and its references are to root/hw, root/sw; taken as root/cimv2; say which with "
+              "--namespace [LABEL=]NAME\n",
+              Shorten(fErr, file, "a"));
     EXPECT_EQ("To Disk.Id=\"sda\"\n"
               "To root/sw:Disk.Id=\"sdb\"\n",
               Targets(file, {"--namespace", "/Root/HW/"}));
+    EXPECT_EQ("", fErr);
+    Targets(file, {"--namespace", "root/x"});
+    EXPECT_EQ("cimdelta: a: names no namespace, and its references are to root/hw, root/sw; taken as root/x, as --namespace says\n",
+              Shorten(fErr, file, "a"));
+}
+
+TEST_F(NamespaceTest, TheOneThatAllReferencesNameIsTakenBeforeTheOption)
+{
+    const std::string file = Scratch("a.xml", Links({PathInto("root/hw", "sda"), Path("Disk", "Id", "sdb")}));
+    EXPECT_EQ("To Disk.Id=\"sda\"\nTo Disk.Id=\"sdb\"\n", Targets(file));
+    EXPECT_EQ("", fErr);
+    EXPECT_EQ("To Disk.Id=\"sda\"\nTo Disk.Id=\"sdb\"\n", Targets(file, {"--namespace", "root/x"}));
+    EXPECT_EQ("cimdelta: a: all references are to namespace root/hw, so --namespace root/x is not used for it\n",
+              Shorten(fErr, file, "a"));
+}
+
+TEST_F(NamespaceTest, TheOneThatTheDocumentNamesIsTakenBeforeTheOption)
+{
+    const std::string file = Scratch(
+        "a.xml", "<CIM><DECLARATION><DECLGROUP.WITHNAME><LOCALNAMESPACEPATH><NAMESPACE NAME=\"root/hw\"/></LOCALNAMESPACEPATH>" +
+                     Class("Disk", "", Declaration("Id", "string")) + "</DECLGROUP.WITHNAME></DECLARATION></CIM>");
+    Run({"show", file, "--namespace", "root/x"});
+    EXPECT_EQ("cimdelta: a: is in namespace root/hw, so --namespace root/x is not used for it\n", Shorten(fErr, file, "a"));
+}
+
+TEST_F(NamespaceTest, IdenticalContentsOfTwoNamespacesAreEqual)
+{
+    const auto links = [](const std::string& ns) {
+        return Links({PathInto(ns, "sda"), Path("Disk", "Id", "sdb"), PathInto(ns, "sdc")});
+    };
+    const std::string a = Scratch("a.xml", links("root/hw"));
+    const std::string b = Scratch("b.xml", links("root/sw"));
+    const std::string report = Result({"compare", "a=" + a, "b=" + b});
+    EXPECT_EQ(0u, report.find("No differences between a and b.\n")) << report;
+    EXPECT_NE(std::string::npos, report.find("Namespace of a: root/hw, the one that its references name.\n"
+                                             "Namespace of b: root/sw, the one that its references name.\n"))
+        << report;
+}
+
+TEST_F(NamespaceTest, EachInventoryMayGetItsOwn)
+{
+    const auto links = [](const std::string& ns) { return Links({PathInto(ns, "sda"), PathInto("root/other", "sdb")}); };
+    const std::string a = "a=" + Scratch("a.xml", links("root/hw"));
+    const std::string b = "b=" + Scratch("b.xml", links("root/sw"));
+    const std::string report = Result({"compare", a, b, "--namespace", "a=root/hw", "--namespace", "b=root/sw"});
+    EXPECT_EQ(0u, report.find("No differences between a and b.\n")) << report;
+    EXPECT_NE(std::string::npos, report.find("Namespace of b: root/sw, as --namespace says.\n")) << report;
+    const nlohmann::json inventories = nlohmann::json::parse(
+        Result({"compare", "-o", "json", a, b, "--namespace", "a=root/hw", "--namespace", "root/sw"}))["inventories"];
+    EXPECT_EQ("root/hw option root/sw option",
+              inventories[0]["namespace"].get<std::string>() + " " + inventories[0]["namespaceFrom"].get<std::string>() + " " +
+                  inventories[1]["namespace"].get<std::string>() + " " + inventories[1]["namespaceFrom"].get<std::string>());
+    EXPECT_EQ("cimdelta: --namespace c=x: no inventory has the label c; name one of these: a, b\n",
+              Complaint({"compare", a, b, "--namespace", "c=x"}));
+    EXPECT_EQ("cimdelta: --namespace y: another one, x, is named for the same inventories; name it once, or put LABEL= in front of "
+              "each\n",
+              Complaint({"compare", a, b, "--namespace", "x", "--namespace", "y"}));
 }
 
 }  // namespace

@@ -84,6 +84,11 @@ TEST_F(SchemaOptionTest, ClassesAreInferred)
 {
     Run({"compare", fA, fB, "--infer-classes", "--allow-empty"});
     EXPECT_EQ(0u, fOut.find("1 difference between a and b: 1 changed value in 1 instance\n")) << fOut << fErr;
+    EXPECT_NE(std::string::npos, fOut.find("Inferred in a from instances, with their keys: Disk (Id).\n"
+                                           "Inferred in b from instances, with their keys: Disk (Id).\n"))
+        << fOut;
+    Run({"compare", fA, fB, "--infer-classes", "-o", "json"});
+    EXPECT_NE(std::string::npos, fOut.find("\"inferredClasses\"")) << fOut;
     Write("b.xml", "<CIM><DECLARATION><DECLGROUP>" + Instance("Disk", Value("Id", "x")) + "</DECLGROUP></DECLARATION></CIM>");
     EXPECT_EQ(
         "cimdelta: F/b.xml:1:44: found an instance of class \"Disk\", which is not declared, and no instance of it has a name "

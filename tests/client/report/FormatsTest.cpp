@@ -38,9 +38,9 @@ TEST_F(FormatsTest, NdjsonHasADocumentForEachDifferenceAndOneForTheCoverage)
             "\"property\":\"Started\",\"reference\":{\"type\":\"boolean\",\"value\":true},"
             "\"others\":[{\"inventories\":[\"web02\"],\"type\":\"boolean\",\"value\":false}]}\n"
             "{\"kind\":\"coverage\",\"inventories\":[{\"label\":\"web01\",\"file\":\"web01.xml\",\"role\":\"reference\","
-            "\"instancesCompared\":2},"
-            "{\"label\":\"web02\",\"file\":\"web02.xml\",\"role\":\"other\",\"instancesCompared\":2},"
-            "{\"label\":\"web03\",\"file\":\"web03.xml\",\"role\":\"other\",\"instancesCompared\":2}],"
+            "\"instancesCompared\":2,\"namespace\":\"root/cimv2\",\"namespaceFrom\":\"default\",\"inferredClasses\":[]},"
+            "{\"label\":\"web02\",\"file\":\"web02.xml\",\"role\":\"other\",\"instancesCompared\":2,\"namespace\":\"root/cimv2\",\"namespaceFrom\":\"default\",\"inferredClasses\":[]},"
+            "{\"label\":\"web03\",\"file\":\"web03.xml\",\"role\":\"other\",\"instancesCompared\":2,\"namespace\":\"root/cimv2\",\"namespaceFrom\":\"default\",\"inferredClasses\":[]}],"
             "\"summary\":{\"differences\":4,\"onlyInReference\":1,\"onlyInOthers\":1,\"changedValues\":2,\"changedInstances\":1,"
             "\"instancesOnlyInOthers\":1,\"everythingCompared\":false,\"nothingCompared\":false},"
             "\"classes\":[") +

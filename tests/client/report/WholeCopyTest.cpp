@@ -11,7 +11,9 @@ class WholeCopyTest : public TPairFixture {
     {
         const std::string original = Scratch("original.xml", document);
         const std::vector<std::string> ofClass = {"show", original, cls, "-o", "cimxml"};
-        const std::string copy = Result(cls.empty() ? std::vector<std::string>{"show", original, "-o", "cimxml"} : ofClass);
+        Run(cls.empty() ? std::vector<std::string>{"show", original, "-o", "cimxml"} : ofClass);
+        EXPECT_EQ(0, fStatus) << fErr;
+        const std::string copy = fOut;
         const std::string report = Compare(document, copy);
         return report.substr(0, report.find('\n'));
     }
