@@ -106,7 +106,7 @@ const TBadMofRow kMistakes[] = {
      "doc.mof:7:1: found class \"A\" with the superclass \"B\", which is not declared; add its <CLASS> to the document or load it "
      "before"},
     {"no class of that name", "instance of Disc { };", 15,
-     "doc.mof:6:1: found an instance of class \"Disc\", which is not declared; add its <CLASS> to the document or load it before"},
+     "doc.mof:6:1: found an instance of class \"Disc\", which is not declared; give its declaration"},
     {"no property of that name", "instance of Disk {\n Id = \"a\"; Sise = 5; };", 15,
      "doc.mof:7:12: found property \"Sise\", but class \"Disk\" declares no such property; add its declaration or correct the "
      "name"},
