@@ -1,11 +1,13 @@
 // The form of a file shows in its first characters, blanks and a byte order mark not counted. MOF begins with a comment, a pragma,
-// a list of qualifiers or one of three words. Everything else is read as CIM-XML, whose reader says what is wrong with it.
+// a list of qualifiers or one of three words. A recorded answer of HTTP is unwrapped first. Everything else is read as CIM-XML,
+// whose reader says what is wrong with it.
 #include "client/inventory/TSourceReader.h"
 
 #include <algorithm>
 #include <boost/algorithm/string/predicate.hpp>
 #include <boost/smart_ptr/make_shared.hpp>
 
+#include "client/files/THttpReader.h"
 #include "client/inventory/TInventoryFile.h"
 #include "embedded/cimxml/TCimXmlDocuments.h"
 
@@ -43,6 +45,11 @@ void TSourceReader::Read(const std::string& path)
     TInventoryFile file(path);
     try {
         TPeekedSource text(file, kFormMark);
+        if (THttpReader::IsHttp(text.GetBeginning())) {
+            THttpReader bodies(text, file.GetName());
+            TPeekedSource body(bodies, kFormMark);
+            return ReadText(body, path, file.GetName());
+        }
         ReadText(text, path, file.GetName());
     } catch (const TPopulateError&) {
         // The text may be malformed only because the compressed file is damaged.

@@ -276,8 +276,8 @@ TEST_F(BadInputTest, ALongKeyMakesNoLongMessage)
                         "<PROPERTY NAME='Id' TYPE='string'><QUALIFIER NAME='Key' TYPE='boolean'><VALUE>true</VALUE></QUALIFIER>"
                         "</PROPERTY><PROPERTY NAME='N' TYPE='uint8'/></CLASS></VALUE.OBJECT>\n" +
                             instance("1") + "\n" + instance("2") + "</DECLGROUP></DECLARATION></CIM>");
-    EXPECT_EQ("cimdelta: I:3:1000156: found a second instance \"root/cimv2:A.Id=\"" + std::string(63, 'k') +
-                  "...\" with \"2\" in property \"N\", but the one at I:2:1000156 has \"1\"; remove one of the two\n",
+    EXPECT_EQ("cimdelta: I:3:1000158: found a second instance \"root/cimv2:A.Id=\"" + std::string(63, 'k') +
+                  "...\" with \"2\" in property \"N\", but the one at I:2:1000158 has \"1\"; remove one of the two\n",
               Shorten(Complaint({"show", inventory}), inventory, "I"));
 }
 
