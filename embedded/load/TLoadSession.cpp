@@ -67,9 +67,9 @@ void TLoadSession::KeepElements()
 TLoadReport TLoadSession::Commit()
 {
     TLoader& loader = fParts->fLoader;
-    fParts->fContext.CheckContents();
     fParts->fContext.Guard([&] {
         fParts->AddLate();
+        fParts->fContext.CheckContents();
         loader.Finish(fParts->fReadObjects);
     });
     fParts->fElements = loader.TakeElements();

@@ -116,8 +116,9 @@ const TBadMofRow kMistakes[] = {
      "doc.mof:6:30: found \"256\" of type uint64 in property \"Size\", which class \"Disk\" declares as uint8"},
     {"no key", "instance of Disk { Size = 1; };", 14,
      "doc.mof:6:1: found an instance of class \"Disk\" without a value for its key \"Id\"; every key needs one"},
-    {"the same instance twice", "instance of Disk { Id = \"a\"; };\ninstance of Disk { Id = \"a\"; };", 12,
-     "doc.mof:7:1: found a second instance root/cimv2:Disk.Id=\"a\"; instances of class \"Disk\" must differ in their keys"},
+    {"an instance twice, with other values", "instance of Disk { Id = \"a\"; };\ninstance of Disk { Id = \"a\"; Size = 2; };", 12,
+     "doc.mof:7:1: found a second instance root/cimv2:Disk.Id=\"a\" with \"2\" in property \"Size\", but the one at doc.mof:6:1 has "
+     "NULL; remove one of the two"},
     {"a path without a class", "instance of Disk { Id = \"a\"; On = \".Id=1\"; };", 13,
      "doc.mof:6:30: found \".Id=1\" of type string in property \"On\", which class \"Disk\" declares as reference"},
     {"an unknown alias", "instance of Disk { Id = \"a\"; On = $B; };", 15,
