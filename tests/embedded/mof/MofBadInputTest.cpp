@@ -103,8 +103,7 @@ const TBadMofRow kMistakes[] = {
      "instance of Disk { Id = \"2\"; };",
      9, "doc.mof:8:27: found namespace \"root/b\" after \"root/a\"; a document holds one namespace, so split this one"},
     {"no superclass of that name", "[Key]\nclass A : B { };", 15,
-     "doc.mof:7:1: found class \"A\" with the superclass \"B\", which is not declared; add its <CLASS> to the document or load it "
-     "before"},
+     "doc.mof:7:1: found class \"A\" with the superclass \"B\", which is not declared; give its declaration"},
     {"no class of that name", "instance of Disc { };", 15,
      "doc.mof:6:1: found an instance of class \"Disc\", which is not declared; give its declaration"},
     {"no property of that name", "instance of Disk {\n Id = \"a\"; Sise = 5; };", 15,
@@ -117,7 +116,8 @@ const TBadMofRow kMistakes[] = {
     {"no key", "instance of Disk { Size = 1; };", 14,
      "doc.mof:6:1: found an instance of class \"Disk\" without a value for its key \"Id\"; every key needs one"},
     {"an instance twice, with other values", "instance of Disk { Id = \"a\"; };\ninstance of Disk { Id = \"a\"; Size = 2; };", 12,
-     "doc.mof:7:1: found a second instance root/cimv2:Disk.Id=\"a\" with \"2\" in property \"Size\", but the one at doc.mof:6:1 has "
+     "doc.mof:7:1: found a second instance root/cimv2:Disk.Id=\"a\" with \"2\" in property \"Size\", but the one at doc.mof:6:1 "
+     "has "
      "NULL; remove one of the two"},
     {"a path without a class", "instance of Disk { Id = \"a\"; On = \".Id=1\"; };", 13,
      "doc.mof:6:30: found \".Id=1\" of type string in property \"On\", which class \"Disk\" declares as reference"},
