@@ -17,7 +17,8 @@ TCIMValue ReadObjectKey(const TCIMValue& text, const boost::shared_ptr<const TIn
     const TLoadContext::TAt somewhere(context, {});
     TCimXmlPathReader paths(context, ns);
     try {
-        return TCimXmlObjectReader(context, ns, paths).Read(TValueAccess::GetText(text));
+        const TCIMValue object = TCimXmlObjectReader(context, ns, paths).Read(TValueAccess::GetText(text));
+        return context.GetBadValues().HasAny() ? text : object;
     } catch (const TZELException& error) {
         if (error.GetStatusCode().GetStatus() == TZELStatusCode::kOutOfMemory) {
             throw;

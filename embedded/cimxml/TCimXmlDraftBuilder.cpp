@@ -70,6 +70,12 @@ void TCimXmlDraftBuilder::EndProperty(TCIMValue value)
     fProperty.reset();
 }
 
+void TCimXmlDraftBuilder::AddBadValue(TBadValue bad)
+{
+    bad.property = fDraft->object.GetProperties().size();
+    fDraft->badValues.push_back(std::move(bad));
+}
+
 void TCimXmlDraftBuilder::BeginMethod(const TCimXmlAttributes& attributes)
 {
     const char* typeName = attributes.Find("TYPE");

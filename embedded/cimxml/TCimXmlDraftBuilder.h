@@ -29,6 +29,10 @@ class TCimXmlDraftBuilder {
     /// The name of the property that is open; valid until it ends.
     const std::string& GetPropertyName() const noexcept { return fProperty->name; }
     void EndProperty(TCIMValue value);
+    /// Notes that the value of the property that is open is bad; it then ends with a null.
+    void AddBadValue(TBadValue bad);
+    /// The class or instance that is open.
+    const TEmbeddedObject& GetObject() const noexcept { return fDraft->object; }
     void BeginMethod(const TCimXmlAttributes& attributes);
     void EndMethod();
     void BeginParameter(const TCimXmlAttributes& attributes);

@@ -23,26 +23,84 @@ void TCimXmlItem::BeginArray(bool isOfReferences)
 void TCimXmlItem::EndArray()
 {
     fType = fType.GetArrayType();
+    if (IsBad()) {
+        return;  // TakeBad needs the elements
+    }
     fValue = TCIMValue(fType, static_cast<unsigned int>(fElements.size()), fElements);
     fElements.clear();
 }
 
 TCIMValue TCimXmlItem::Take()
 {
+    if (IsBad()) {
+        FailBad();
+    }
     TCIMValue value = IsNull() ? TCIMValue::Null(fType) : std::move(fValue);
     fValue = TCIMValue();
     return value;
 }
 
+void TCimXmlItem::FailBad()
+{
+    const TBadValue bad = TakeBad();
+    const TLoadContext::TAt at(fContext, bad.place);
+    fContext.Fail(EStatus::kTypeMismatch, "found " + Quote(bad.text) + " as value of " + Quote(fName) + ", expected a " + bad.type);
+}
+
 void TCimXmlItem::Parse(std::string_view text, TCIMValue& value)
 {
     const TType type = fType.GetElementType();
-    if (type == TType::kString) {
-        value = IsObject(text) ? fObjects.Read(text) : fContext.GetTexts().MakeValue(text);
-    } else if (!TValueText::Parse(type, text, value)) {
-        fContext.Fail(EStatus::kTypeMismatch,
-                      "found " + Quote(text) + " as value of " + Quote(fName) + ", expected a " + TValueText::GetTypeName(type));
+    if (type != TType::kString) {
+        if (!TValueText::Parse(type, text, value)) {
+            NoteBad(text, TValueText::GetTypeName(type));
+        }
+    } else if (IsObject(text)) {
+        ReadObject(text, value);
+    } else {
+        value = fContext.GetTexts().MakeValue(text);
     }
+}
+
+void TCimXmlItem::NoteBad(std::string_view text, const char* type)
+{
+    const std::size_t position = fElements.empty() ? 0 : fElements.size() - 1;
+    fBadTexts.push_back({position, std::string(text), type, fContext.GetPlace()});
+}
+
+/// What is wrong inside of the object is the message of a load that refuses it.
+void TCimXmlItem::ReadObject(std::string_view text, TCIMValue& value)
+{
+    if (fContext.GetOptions().badValues == EBadValues::kRefuse) {
+        value = fObjects.Read(text);
+        return;
+    }
+    try {
+        value = fObjects.Read(text);
+    } catch (const TPopulateError& error) {
+        if (error.GetStatusCode().GetStatus() == EStatus::kOutOfMemory) {
+            throw;
+        }
+        NoteBad(text, "class or instance");
+    }
+}
+
+/// An array is one of texts then: the elements that fit are written as values of their type are.
+TBadValue TCimXmlItem::TakeBad()
+{
+    const std::vector<TBadText> bad = std::exchange(fBadTexts, {});
+    TBadValue result{0, TCIMValue::FromText(bad.front().text), bad.front().text, bad.front().type, bad.front().place};
+    if (!fType.IsArray()) {
+        return result;
+    }
+    for (TCIMValue& element : fElements) {
+        element = element.IsNull() ? TCIMValue::Null(TType::kString) : TCIMValue::FromText(element.ToText());
+    }
+    for (const TBadText& one : bad) {
+        fElements[one.position] = TCIMValue::FromText(one.text);
+    }
+    result.value = TCIMValue(TType::kArrayString, static_cast<unsigned int>(fElements.size()), fElements);
+    fElements.clear();
+    return result;
 }
 
 /// Without a mark in the document, the declaration allows plain text too, so the text itself has to decide.

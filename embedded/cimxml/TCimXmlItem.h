@@ -1,10 +1,13 @@
 #pragma once
 
+#include <cstddef>
+#include <string>
 #include <string_view>
 #include <utility>
 #include <vector>
 
 #include "embedded/load/EValueText.h"
+#include "embedded/load/TBadValue.h"
 #include "embedded/load/TLoadContext.h"
 #include "host/TCIMValue.h"
 
@@ -14,6 +17,7 @@ class TCimXmlObjectReader;
 
 /// A property, a qualifier or a qualifier's declaration while its value is read. One item serves many elements in turn.
 ///
+/// A text that is no value of the item's type is a bad value; the item is null then, and TakeBad comes before Take.
 /// Order of calls: Begin; for a simple value BeginValue and then SetText, SetReference or, for a null, nothing; for an array
 /// BeginArray, any number of AddText, AddReference and AddNull, EndArray; at last Take. Without a value, Take returns a typed null.
 /// Errors: fail through the context with the status that each operation names; the load then ends.
@@ -40,7 +44,8 @@ class TCimXmlItem {
             FailSecond();
         }
     }
-    /// Reads a simple value. Errors: kTypeMismatch (13) if the text is no value of the item's type.
+    /// Reads a simple value. Errors: those of TCimXmlObjectReader::Read for an embedded object, unless TLoadOptions::badValues let
+    /// it pass.
     void SetText(std::string_view text) { Parse(text, fValue); }
     void SetReference(TCIMValue path) noexcept { fValue = std::move(path); }
 
@@ -55,15 +60,30 @@ class TCimXmlItem {
     TType GetType() const noexcept { return fType; }
     EValueText GetText() const noexcept { return fText; }
     bool IsNull() const noexcept { return fValue.IsNull(); }
+    /// Whether a text is no value of the item's type. The item is null then.
+    bool IsBad() const noexcept { return !fBadTexts.empty(); }
+    /// What it holds instead, once. Call it only if IsBad.
+    TBadValue TakeBad();
     /// The value, which the caller may move away; null if there is none.
     TCIMValue& GetValue() noexcept { return fValue; }
-    /// The value, or a null of the item's type.
+    /// The value, or a null of the item's type. Errors: kTypeMismatch (13) if there is a bad value, which was not taken.
     TCIMValue Take();
 
   private:
+    /// A text that is no value, with its position among the elements of an array.
+    struct TBadText {
+        std::size_t position;
+        std::string text;
+        const char* type;
+        TLoadPlace place;
+    };
+
     void Parse(std::string_view text, TCIMValue& value);
+    void NoteBad(std::string_view text, const char* type);
+    void ReadObject(std::string_view text, TCIMValue& value);
     bool IsObject(std::string_view text) const;
     [[noreturn]] void FailSecond() const;
+    [[noreturn]] void FailBad();
 
     TLoadContext& fContext;
     TCimXmlObjectReader& fObjects;
@@ -73,6 +93,7 @@ class TCimXmlItem {
     bool fIsGiven = false;
     TCIMValue fValue;
     std::vector<TCIMValue> fElements;  // of the array that is open; kept for its memory
+    std::vector<TBadText> fBadTexts;   // in the order of the elements
 };
 
 }  // namespace NORVZEL20

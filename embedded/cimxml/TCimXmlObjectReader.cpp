@@ -57,16 +57,31 @@ TCimXmlObjectReader::~TCimXmlObjectReader() = default;
 
 TCIMValue TCimXmlObjectReader::Read(std::string_view text)
 {
-    fContext.EnterEmbeddedObject();
-    if (!fNested) {
-        fNested = std::make_unique<TNested>(fContext, fNamespace, fParser);
+    const std::size_t depth = fContext.GetEmbeddedDepth();
+    try {
+        fContext.EnterEmbeddedObject();
+        if (!fNested) {
+            fNested = std::make_unique<TNested>(fContext, fNamespace, fParser);
+        }
+        TCIMValue value(fNested->Read(text));
+        fContext.LeaveEmbeddedObject();
+        if (fNested->TakeMetUnsettled()) {
+            fPaths.NoteUnsettled();
+        }
+        return value;
+    } catch (...) {
+        Abandon(depth);
+        throw;
     }
-    TCIMValue value(fNested->Read(text));
-    fContext.LeaveEmbeddedObject();
-    if (fNested->TakeMetUnsettled()) {
-        fPaths.NoteUnsettled();
+}
+
+/// Makes ready for another text after an error in the middle of one.
+void TCimXmlObjectReader::Abandon(std::size_t depth) noexcept
+{
+    fNested.reset();
+    while (fContext.GetEmbeddedDepth() > depth) {
+        fContext.LeaveEmbeddedObject();
     }
-    return value;
 }
 
 TCIMValue TCimXmlObjectReader::ReadAll(const TCIMValue& value)

@@ -26,13 +26,15 @@ class TCimXmlObjectReader {
     TCimXmlObjectReader& operator=(const TCimXmlObjectReader&) = delete;
     ~TCimXmlObjectReader();
 
-    /// The embedded object that the text describes.
+    /// The embedded object that the text describes. After an error, other texts can be read.
     TCIMValue Read(std::string_view text);
     /// The value, or for an array each of its elements, with text that looks like an object replaced by that object.
     TCIMValue ReadAll(const TCIMValue& value);
 
   private:
     class TNested;
+
+    void Abandon(std::size_t depth) noexcept;
 
     TLoadContext& fContext;
     boost::shared_ptr<const TInMemNamespace> fNamespace;

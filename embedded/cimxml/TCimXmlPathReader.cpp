@@ -263,7 +263,17 @@ TCIMValue TCimXmlPathReader::ReadKey(std::string_view text)
         return value;
     }
     const std::string expected = type != TType::kNone ? fType : fValueType == "boolean" ? "boolean" : "number";
-    fContext.Fail(EStatus::kTypeMismatch, "found " + Quote(text) + " as the value of a key, expected a " + expected);
+    return SettleBadKey({0, fContext.GetTexts().MakeValue(text), std::string(text), expected, fContext.GetPlace()});
+}
+
+TCIMValue TCimXmlPathReader::SettleBadKey(const TBadValue& bad)
+{
+    const TFrame& frame = fFrames[fDepth - 1];
+    if (fContext.GetOptions().badValues == EBadValues::kNull) {
+        fContext.FailBadKey(bad, frame.className, frame.keyName);
+    }
+    fContext.NoteBadValue(bad, frame.className, frame.keyName, true);
+    return bad.value;
 }
 
 }  // namespace NORVZEL20

@@ -71,6 +71,7 @@ class TCimXmlPathReader {
 
     boost::shared_ptr<TInMemClass> FindClass(const std::string& name);
     TCIMValue ReadKey(std::string_view text);
+    TCIMValue SettleBadKey(const TBadValue& bad);
     void SetPlace(TCIMReference& path, const TFrame& frame);
     const std::string& FindOnlyKey(const TInMemClass* cls) const;
 

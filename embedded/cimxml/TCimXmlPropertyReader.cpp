@@ -30,6 +30,24 @@ void TCimXmlPropertyReader::BeginInDraft(const TCimXmlAttributes& attributes)
     fItem.Begin(fDraft.GetPropertyName(), type, GetText(attributes, type, false));
 }
 
+void TCimXmlPropertyReader::EndInDraft()
+{
+    fDraft.EndProperty(fItem.IsBad() ? SettleInDraft(fItem.TakeBad()) : fItem.Take());
+}
+
+/// The loader settles those of its instances, when their classes are declared. Embedded objects and default values of classes never
+/// come there; a default value stands for the property's type, so it cannot be text.
+TCIMValue TCimXmlPropertyReader::SettleInDraft(TBadValue bad)
+{
+    const bool isClass = fDraft.GetObject().IsClass();
+    if (fLoader != nullptr && !isClass) {
+        fDraft.AddBadValue(std::move(bad));
+        return TCIMValue::Null(fItem.GetType());
+    }
+    fContext.NoteBadValue(bad, fDraft.GetObject().GetClassName(), fDraft.GetPropertyName(), fLoader == nullptr);
+    return isClass || fContext.GetOptions().badValues != EBadValues::kText ? TCIMValue::Null(fItem.GetType()) : bad.value;
+}
+
 void TCimXmlPropertyReader::BeginInInstance(const TCimXmlAttributes& attributes)
 {
     fTarget = &fLoader->FindProperty(attributes.Require("NAME"));
@@ -51,13 +69,24 @@ void TCimXmlPropertyReader::BeginInInstance(std::uint64_t number, const TCimXmlA
 /// A new instance has nulls already, apart from what it shares with others.
 void TCimXmlPropertyReader::EndInInstance()
 {
-    if (fItem.IsNull() && !fTarget->isStatic) {
-        return;
+    if (fItem.IsNull()) {
+        if (fItem.IsBad()) {
+            return EndBad();
+        }
+        if (!fTarget->isStatic) {
+            return;
+        }
     }
     const bool isUnsettled = fPaths.TakeMetUnsettled();
     if (isUnsettled || !fLoader->FillProperty(*fTarget, fItem.GetValue())) {
         fLoader->SetProperty(*fTarget, fItem.Take(), isUnsettled);
     }
+}
+
+void TCimXmlPropertyReader::EndBad()
+{
+    fPaths.TakeMetUnsettled();
+    fLoader->SetBad(*fTarget, fItem.TakeBad());
 }
 
 EValueText TCimXmlPropertyReader::GetText(const TCimXmlAttributes& attributes, TType type, bool isDeclaredEmbedded)

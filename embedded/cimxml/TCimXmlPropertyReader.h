@@ -29,7 +29,7 @@ class TCimXmlPropertyReader {
 
     /// Begins a property of a draft.
     void BeginInDraft(const TCimXmlAttributes& attributes);
-    void EndInDraft() { fDraft.EndProperty(fItem.Take()); }
+    void EndInDraft();
 
     /// Begins a property of the instance that the loader is filling. Errors: see TInstanceBuilder::FindProperty.
     void BeginInInstance(const TCimXmlAttributes& attributes);
@@ -40,6 +40,8 @@ class TCimXmlPropertyReader {
   private:
     using TType = TCIMValue::TCIMType;
 
+    void EndBad();
+    TCIMValue SettleInDraft(TBadValue bad);
     static EValueText GetText(const TCimXmlAttributes& attributes, TType type, bool isDeclaredEmbedded);
     static TType ReadType(const TCimXmlAttributes& attributes, TType declared);
 

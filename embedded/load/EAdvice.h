@@ -5,8 +5,10 @@ namespace NORVZEL20 {
 /// What the user of a load can do about an error, for programs that have options for it.
 enum class EAdvice : unsigned char {
     kNone,
-    kGiveDeclaration,        ///< TLoadOptions::schema may give the declaration that is missing
-    kGiveOrInferDeclaration  ///< likewise, and TLoadOptions::infersClasses may too
+    kGiveDeclaration,         ///< TLoadOptions::schema may give the declaration that is missing
+    kGiveOrInferDeclaration,  ///< likewise, and TLoadOptions::infersClasses may too
+    kLetBadValuesPass,        ///< another choice for TLoadOptions::badValues
+    kKeepBadValuesAsText      ///< TLoadOptions::badValues as text
 };
 
 }  // namespace NORVZEL20

@@ -14,6 +14,12 @@ std::string Quote(std::string_view text)
     return quoted + (text.size() > kLongest ? "...\"" : "\"");
 }
 
+std::string QuoteIfLong(const std::string& path)
+{
+    constexpr std::size_t kLongestPath = 200;
+    return path.size() > kLongestPath ? Quote(path) : path;
+}
+
 std::string DescribeSecondProperty(std::string_view property, const char* object)
 {
     return "found property " + Quote(property) + " a second time in one " + object;

@@ -9,6 +9,9 @@ namespace NORVZEL20 {
 /// dots.
 std::string Quote(std::string_view text);
 
+/// A path for a message: as it is, or quoted and cut if it is very long.
+std::string QuoteIfLong(const std::string& path);
+
 /// The message that an object (a "class" or an "instance") has a property twice.
 std::string DescribeSecondProperty(std::string_view property, const char* object);
 

@@ -3,6 +3,7 @@
 #include <string>
 #include <vector>
 
+#include "embedded/load/TBadValue.h"
 #include "embedded/load/TLoadPlace.h"
 #include "embedded/value/TEmbeddedObject.h"
 
@@ -14,8 +15,9 @@ struct TDraft {
     TLoadPlace place;
     std::vector<TLoadPlace> propertyPlaces;                  ///< in the order of the object's properties
     std::vector<std::pair<std::string, TCIMValue>> ownKeys;  ///< for an instance: the keys of the name in front of it
-    bool hasName = false;        ///< whether a name stands in front of the instance, perhaps without keys
-    bool takesDefaults = false;  ///< whether an instance has the defaults of its class where it gives no value
+    bool hasName = false;                   ///< whether a name stands in front of the instance, perhaps without keys
+    bool takesDefaults = false;             ///< whether an instance has the defaults of its class where it gives no value
+    std::vector<TBadValue> badValues = {};  ///< for an instance: those that are no values of the types written; NULL in the object
 };
 
 }  // namespace NORVZEL20

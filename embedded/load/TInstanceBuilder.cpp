@@ -47,6 +47,19 @@ void DropPlaces(TCIMValue& value)
     });
 }
 
+/// A string, or an array of strings and nulls.
+TCIMValue AsText(const TCIMValue& value)
+{
+    if (!value.GetType().IsArray()) {
+        return value.IsNull() ? TCIMValue::Null(TCIMValue::TCIMType::kString) : TCIMValue::FromText(value.ToText());
+    }
+    std::vector<TCIMValue> texts;
+    for (const TCIMValue& element : value.GetElements()) {
+        texts.push_back(AsText(element));
+    }
+    return TCIMValue(TCIMValue::TCIMType::kArrayString, static_cast<unsigned int>(texts.size()), texts);
+}
+
 }  // namespace
 
 bool TInstanceBuilder::Begin(const char* className)
@@ -102,12 +115,16 @@ TLoadTarget& TInstanceBuilder::FindProperty(const char* name)
 void TInstanceBuilder::SetProperty(const TLoadTarget& target, TCIMValue&& value, bool isUnsettled)
 {
     if (value.GetType() != target.type) {
-        value = Convert(target, value);
+        TCIMValue converted;
+        if (!Convert(target, value, converted)) {
+            return SetBad(target, {0, AsText(value), value.ToText(), TValueText::DescribeType(target.type), fContext.GetPlace()});
+        }
+        value = std::move(converted);
         // A reference that was text names a class that may be declared later.
         isUnsettled = isUnsettled || target.type.GetElementType() == TCIMValue::TCIMType::kReference;
     }
     if (target.isStatic) {
-        SetStatic(target, value);
+        SetStatic(target, value, true);
     } else {
         fInstance->SetSlot(target.slot, std::move(value));
     }
@@ -119,13 +136,37 @@ void TInstanceBuilder::SetProperty(const TLoadTarget& target, TCIMValue&& value,
     fLayout->isHeld = fLayout->isHeld || fLayout->cls->GetLayout().GetDecl(target.slot).IsKey();
 }
 
+/// What is to be refused is kept as text meanwhile, so that instances with a bad key do not end the load before all is counted.
+void TInstanceBuilder::SetBad(const TLoadTarget& target, const TBadValue& bad)
+{
+    const TInMemPropertyDecl& decl = fLayout->cls->GetLayout().GetDecl(target.slot);
+    const bool isNull = fContext.GetOptions().badValues == EBadValues::kNull;
+    if (isNull && decl.IsKey()) {
+        fContext.FailBadKey(bad, fLayout->cls->GetName(), *target.name);
+    }
+    fContext.NoteBadValue(bad, fLayout->cls->GetName(), *target.name, true);
+    TCIMValue value = isNull ? TCIMValue::Null(target.type) : decl.IsBag() ? bad.value.AsBag() : bad.value;
+    if (target.isStatic) {
+        SetStatic(target, value, isNull);
+    } else {
+        fInstance->Change(target.slot, std::move(value));  // text does not fit the slot either
+    }
+}
+
 /// The last value would be that of all instances. So if two instances give different ones, what the document says of one is lost.
-void TInstanceBuilder::SetStatic(const TLoadTarget& target, const TCIMValue& value)
+/// A value that does not fit the declared type is put in without a check.
+void TInstanceBuilder::SetStatic(const TLoadTarget& target, const TCIMValue& value, bool fits)
 {
     TInMemPropertyDecl& decl = *fLayout->cls->GetLayout().GetSharedDecl(target.slot);
     TInMemStaticProperty& property = decl.GetStaticProperty();
     const TCIMValue before = property.GetValue();
-    property.SetValue(value);
+    if (fits) {
+        property.SetValue(value);
+    } else {
+        TInMemStaticProperty::TState state = property.GetState();
+        state.value = value;
+        property.SetState(state);
+    }
     if (!fGivenStatics.insert(&decl).second && property.GetValue() != before) {
         fContext.Fail(EStatus::kParseError, "found " + Show(value) + " in the static property " + Quote(*target.name) +
                                                 " of class " + Quote(fLayout->cls->GetName()) + ", which has " + Show(before) +
@@ -134,21 +175,18 @@ void TInstanceBuilder::SetStatic(const TLoadTarget& target, const TCIMValue& val
 }
 
 /// Writers do not always use the declared type: another one is accepted if the declared type can hold the value exactly.
-TCIMValue TInstanceBuilder::Convert(const TLoadTarget& target, const TCIMValue& value)
+/// Returns false if it cannot.
+bool TInstanceBuilder::Convert(const TLoadTarget& target, const TCIMValue& value, TCIMValue& converted)
 {
     const std::string& className = fLayout->cls->GetName();
-    TCIMValue converted;
     if (!TValueText::Convert(value, target.type, converted)) {
-        fContext.Fail(EStatus::kTypeMismatch, "found " + Quote(value.ToText()) + " of type " +
-                                                  TValueText::DescribeType(value.GetType()) + " in property " +
-                                                  Quote(*target.name) + ", which class " + Quote(className) + " declares as " +
-                                                  TValueText::DescribeType(target.type));
+        return false;
     }
     fContext.Tolerate("other type", "property " + Quote(*target.name) + " of class " + Quote(className) + " is written as " +
                                         TValueText::DescribeType(value.GetType()) + "; taken as the declared " +
                                         TValueText::DescribeType(target.type));
     Localize(converted);
-    return converted;
+    return true;
 }
 
 /// References get the form that their classes declare, as far as they are declared, and lose the document's own namespace. Returns
@@ -166,11 +204,20 @@ void TInstanceBuilder::Fill(const TDraft& draft, const TReadObjects& readObjects
         fContext.Fail(EStatus::kNotFound, "found an instance of class " + Quote(object.GetClassName()) + kIsNotDeclared,
                       EAdvice::kGiveOrInferDeclaration);
     }
+    auto bad = draft.badValues.begin();  // in the order of the properties
     for (std::size_t index = 0; index < object.GetProperties().size(); ++index) {
         const TLoadContext::TAt at(fContext, draft.propertyPlaces[index]);
         const TEmbeddedObject::TProperty& property = object.GetProperties()[index];
         const TLoadTarget& target = FindProperty(property.name.c_str());
-        TCIMValue value = target.isEmbedded ? readObjects(property.value) : property.value;
+        if (bad != draft.badValues.end() && bad->property == index) {
+            SetBad(target, *bad++);
+            continue;
+        }
+        TCIMValue value;
+        if (!ReadObjects(target, property.value, readObjects, value)) {
+            SetBad(target, {index, AsText(property.value), property.value.ToText(), "class or instance", fContext.GetPlace()});
+            continue;
+        }
         const bool isOpen = Localize(value);
         SetProperty(target, std::move(value), isOpen);
     }
@@ -190,6 +237,21 @@ void TInstanceBuilder::FillDefaults()
         target->given = fNumber;
         const bool isOpen = Localize(value);
         SetProperty(*target, std::move(value), isOpen);
+    }
+}
+
+/// Returns false if text is no embedded object although it looks like one, and TLoadOptions::badValues let it pass.
+bool TInstanceBuilder::ReadObjects(const TLoadTarget& target, const TCIMValue& written, const TReadObjects& readObjects,
+                                   TCIMValue& value) const
+{
+    try {
+        value = target.isEmbedded ? readObjects(written) : written;
+        return true;
+    } catch (const TPopulateError& error) {
+        if (fContext.GetOptions().badValues == EBadValues::kRefuse || error.GetStatusCode().GetStatus() == EStatus::kOutOfMemory) {
+            throw;
+        }
+        return false;
     }
 }
 

@@ -45,9 +45,12 @@ class TInstanceBuilder {
         return target != nullptr && target->tag.number == tagNumber && Take(*target) ? target : nullptr;
     }
     /// `isUnsettled` says that references in the value may have to be written again (see TCimXmlPathReader::TakeMetUnsettled). A
-    /// value of another type is converted. Errors: kTypeMismatch (13) if that would lose something; kParseError (9) if the property
-    /// is static and another instance has given it another value.
+    /// value of another type is converted; if that would lose something, it is a bad value: see SetBad. Errors: those of SetBad;
+    /// kParseError (9) if the property is static and another instance has given it another value.
     void SetProperty(const TLoadTarget& target, TCIMValue&& value, bool isUnsettled);
+    /// As SetProperty for a value that does not fit the type that it is written with. It becomes what TLoadOptions::badValues says,
+    /// and is counted. Errors: kTypeMismatch (13) if it would be NULL and is a key.
+    void SetBad(const TLoadTarget& target, const TBadValue& bad);
     /// As SetProperty with a value that is not unsettled and not null. Returns false if there is more to do than to keep the value,
     /// which is then as it was; otherwise it is null now.
     bool FillProperty(const TLoadTarget& target, TCIMValue& value) noexcept
@@ -76,8 +79,9 @@ class TInstanceBuilder {
         return true;
     }
     TLoadLayout* FindLayout(const char* className);
-    void SetStatic(const TLoadTarget& target, const TCIMValue& value);
-    TCIMValue Convert(const TLoadTarget& target, const TCIMValue& value);
+    void SetStatic(const TLoadTarget& target, const TCIMValue& value, bool fits);
+    bool Convert(const TLoadTarget& target, const TCIMValue& value, TCIMValue& converted);
+    bool ReadObjects(const TLoadTarget& target, const TCIMValue& written, const TReadObjects& readObjects, TCIMValue& value) const;
     bool Localize(TCIMValue& value) const;
     void FillDefaults();
     void UseKeys(const TOwnKeys& keys);

@@ -10,6 +10,7 @@
 
 #include "embedded/load/MessageText.h"
 #include "embedded/value/TNameText.h"
+#include "embedded/value/TUtf8.h"
 #include "embedded/value/Trim.h"
 
 namespace NORVZEL20 {
@@ -39,9 +40,10 @@ void TLoadContext::EndDocument()
 
 void TLoadContext::Fail(TZELStatusCode::EStatusCode status, const std::string& message, EAdvice advice) const
 {
-    const TLoadPlace place = GetPlace();
-    throw TPopulateError(status, fEmbeddedDepth > 0 ? "in an embedded object: " + message : message, NameOf(place),
-                         place.place.line, place.place.column, advice);
+    if (HasRefused()) {
+        FailForBadValues(false);
+    }
+    Throw(status, fEmbeddedDepth > 0 ? "in an embedded object: " + message : message, GetPlace(), advice);
 }
 
 std::string TLoadContext::Describe(const TLoadPlace& place) const
@@ -53,6 +55,49 @@ std::string TLoadContext::Describe(const TLoadPlace& place) const
 std::string TLoadContext::NameOf(const TLoadPlace& place) const
 {
     return place.document < fDocuments.size() ? fDocuments[place.document] : std::string();
+}
+
+void TLoadContext::Throw(TZELStatusCode::EStatusCode status, const std::string& message, const TLoadPlace& place,
+                         EAdvice advice) const
+{
+    throw TPopulateError(status, message, NameOf(place), place.place.line, place.place.column, advice);
+}
+
+void TLoadContext::NoteBadValue(const TBadValue& bad, const std::string& className, const std::string& property, bool isInInstance)
+{
+    constexpr std::size_t kLongestText = 80;
+    TBadProperty first;
+    first.className = className;
+    first.property = property;
+    first.text = TUtf8::Shorten(bad.text, kLongestText);
+    first.text += first.text.size() < bad.text.size() ? "..." : "";
+    first.type = bad.type;
+    first.document = NameOf(bad.place);
+    first.line = bad.place.place.line;
+    first.column = bad.place.place.column;
+    fBadValues.Note(std::move(first), isInInstance);
+}
+
+void TLoadContext::FailBadKey(const TBadValue& bad, const std::string& className, const std::string& property) const
+{
+    Throw(TZELStatusCode::kTypeMismatch,
+          "found " + Quote(bad.text) + " in key " + Quote(property) + " of class " + Quote(className) + ", expected a " + bad.type +
+              "; a key cannot be NULL, so correct it, or have such values loaded as text",
+          bad.place, EAdvice::kKeepBadValuesAsText);
+}
+
+void TLoadContext::RefuseBadValues() const
+{
+    if (HasRefused()) {
+        FailForBadValues(true);
+    }
+}
+
+void TLoadContext::FailForBadValues(bool isWhole) const
+{
+    const TBadProperty& first = fReport.badProperties.front();
+    throw TPopulateError(TZELStatusCode::kTypeMismatch, fBadValues.Describe(isWhole), first.document, first.line, first.column,
+                         EAdvice::kLetBadValuesPass);
 }
 
 void TLoadContext::EnterEmbeddedObject()

@@ -8,6 +8,8 @@
 #include <vector>
 
 #include "embedded/load/IPlaceSource.h"
+#include "embedded/load/TBadValue.h"
+#include "embedded/load/TBadValues.h"
 #include "embedded/load/TLoadContents.h"
 #include "embedded/load/TLoadOptions.h"
 #include "embedded/load/TLoadPlace.h"
@@ -59,8 +61,17 @@ class CIMDELTA_INTERNAL_EXPORT TLoadContext {
     /// Ends the document that was begun last. What fails after it, outside of any document and TAt, is reported at its end.
     void EndDocument();
 
-    /// Ends the load. `message` says what was found and what was expected or can be done.
+    /// Ends the load. `message` says what was found and what was expected or can be done. If values that do not fit were found
+    /// before and are to be refused, the error is about the first of them instead.
     [[noreturn]] void Fail(TZELStatusCode::EStatusCode status, const std::string& message, EAdvice advice = EAdvice::kNone) const;
+
+    /// Counts a value of a property of `className` that does not fit its type. `isInInstance`: see TBadValues::Note.
+    void NoteBadValue(const TBadValue& bad, const std::string& className, const std::string& property, bool isInInstance);
+    /// Fails with kTypeMismatch (13), since a key cannot be NULL.
+    [[noreturn]] void FailBadKey(const TBadValue& bad, const std::string& className, const std::string& property) const;
+    TBadValues& GetBadValues() noexcept { return fBadValues; }
+    /// Call it when everything was read. Errors: fails with kTypeMismatch (13) if there are values to be refused.
+    void RefuseBadValues() const;
 
     /// The place of the innermost TAt, or else the position being read.
     TLoadPlace GetPlace() const;
@@ -89,8 +100,7 @@ class CIMDELTA_INTERNAL_EXPORT TLoadContext {
     void CheckContents();
 
     /// Call these two around the reading of an embedded object; messages then mention that they are about one. Errors: fails with
-    /// kParseError (9) if objects are nested too deeply. An error ends the load, so code that throws need not call
-    /// LeaveEmbeddedObject.
+    /// kParseError (9) if objects are nested too deeply.
     void EnterEmbeddedObject();
     void LeaveEmbeddedObject() noexcept { --fEmbeddedDepth; }
     std::size_t GetEmbeddedDepth() const noexcept { return fEmbeddedDepth; }
@@ -121,12 +131,18 @@ class CIMDELTA_INTERNAL_EXPORT TLoadContext {
         const IPlaceSource* reader;
     };
 
+    bool HasRefused() const noexcept { return fOptions.badValues == EBadValues::kRefuse && fBadValues.HasAny(); }
+    [[noreturn]] void FailForBadValues(bool isWhole) const;
+    [[noreturn]] void Throw(TZELStatusCode::EStatusCode status, const std::string& message, const TLoadPlace& place,
+                            EAdvice advice) const;
+
     std::vector<std::string> fDocuments;  // their names
     std::vector<TOpen> fOpen;             // the innermost document comes last
     TLoadPlace fEnd;                      // of the document that was ended last
     std::optional<TLoadPlace> fPlace;     // of the innermost TAt
     TLoadReport fReport;
     TOwnPlaceSearch fOwnPlace{fReport};
+    TBadValues fBadValues{fReport.badProperties};
     std::vector<const char*> fKinds;  // of the entries of fReport.tolerated
     TTextPool fTexts;
     TLoadOptions fOptions;

@@ -4,6 +4,8 @@
 #include <string>
 #include <vector>
 
+#include "embedded/load/TBadProperty.h"
+
 namespace NORVZEL20 {
 
 /// What a load found and added. A plain value.
@@ -41,8 +43,9 @@ struct TLoadReport {
     std::size_t qualifierDecls = 0;
     std::size_t classes = 0;
     std::size_t instances = 0;
-    std::vector<TInferred> inferred;    ///< in the order of their first instances
-    std::vector<TTolerated> tolerated;  ///< one entry for each kind, in the order of their first ones
+    std::vector<TInferred> inferred;          ///< in the order of their first instances
+    std::vector<TTolerated> tolerated;        ///< one entry for each kind, in the order of their first ones
+    std::vector<TBadProperty> badProperties;  ///< those with values that do not fit, which TLoadOptions::badValues let pass
 };
 
 }  // namespace NORVZEL20

@@ -72,6 +72,7 @@ TLoadReport TLoadSession::Commit()
         fParts->fContext.CheckContents();
         loader.Finish(fParts->fReadObjects);
     });
+    fParts->fContext.RefuseBadValues();
     fParts->fElements = loader.TakeElements();
     loader.Commit();
     return std::move(fParts->fContext.GetReport());

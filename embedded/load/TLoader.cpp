@@ -52,6 +52,7 @@ void TLoader::AddQualifierDecl(const TQualifierDraft& draft)
 void TLoader::AddClass(TDraft draft)
 {
     fContext.GetContents().NoteObject();
+    fContext.GetBadValues().LeaveNameless();
     fClasses.Add(std::move(draft));
 }
 
@@ -68,6 +69,9 @@ bool TLoader::BeginInstance(const char* className)
 void TLoader::EndInstance(const TOwnKeys* ownKeys)
 {
     const boost::shared_ptr<TInMemInstance> instance = fBuilder.Take(ownKeys);
+    if (fContext.GetBadValues().LackInstance()) {
+        fContext.GetBadValues().NameInstance(instance->GetReference());
+    }
     if (fBuilder.IsHeld() || fHasEnded) {
         fLate.Hold(instance, fContext.GetPlace());
     } else {
@@ -121,9 +125,11 @@ void TLoader::FillInstance(TDraft draft, const TReadObjects& readObjects)
     }
 }
 
+/// Bad values are noted when it is filled; only those within embedded objects and paths have been noted by now.
 void TLoader::AddInstance(TDraft draft)
 {
     fContext.GetContents().NoteObject();
+    fContext.GetBadValues().LeaveNameless();
     if (!fContext.GetOptions().takesDeclarationsOnly) {
         fLate.Wait(std::move(draft));
     }

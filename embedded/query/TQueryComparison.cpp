@@ -102,7 +102,8 @@ bool TQueryComparison::IsReadable(const TCIMValue& literal, TCIMValue::TCIMType 
 
 TQueryComparison::EResult TQueryComparison::Compare(const TCIMValue& a, const TCIMValue& b)
 {
-    if (a.IsNull() || b.IsNull() || HoldsObject(a) || HoldsObject(b)) {
+    // A value may be text that does not fit its declared type.
+    if (a.IsNull() || b.IsNull() || HoldsObject(a) || HoldsObject(b) || !AreComparable(a.GetType(), b.GetType())) {
         return kUnknown;
     }
     if (TTypeKind::IsNumber(a.GetType())) {

@@ -119,7 +119,11 @@ void TInMemExtent::SkipGenerated(const TInMemInstance& instance) noexcept
         if (!fLayout.GetDecl(slot).IsGenerated()) {
             continue;
         }
-        const std::uint64_t number = instance.GetSlotValue(slot).GetUnsigned();
+        const TCIMValue& key = instance.GetSlotValue(slot);
+        if (key.GetType() != TCIMValue::TCIMType::kUint64) {
+            continue;  // a load may have kept text that is no number
+        }
+        const std::uint64_t number = key.GetUnsigned();
         if (number >= fNextGenerated && number < std::numeric_limits<std::uint64_t>::max()) {
             fNextGenerated = number + 1;
         }

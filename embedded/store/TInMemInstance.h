@@ -67,8 +67,8 @@ class CIMDELTA_EXPORT TInMemInstance final : public ICIMInstance, public boost::
 
     /// The value in the form in which the property in that slot holds it. Errors: kTypeMismatch (13).
     TCIMValue Fit(std::uint32_t slot, TCIMValue&& value) const;
-    /// Sets the instance's own property in a slot. While the instance is in a namespace, it keeps the first value that a key had.
-    /// Errors: std::bad_alloc, and then nothing has changed.
+    /// Sets the instance's own property in a slot, also to a value that does not fit its declared type; Fit checks that. While the
+    /// instance is in a namespace, it keeps the first value that a key had. Errors: std::bad_alloc, and then nothing has changed.
     void Change(std::uint32_t slot, TCIMValue&& fitting);
     /// The same; the value before the first such change is kept.
     void MarkChanged(std::uint32_t slot, TCIMValue&& fitting);

@@ -79,9 +79,13 @@ const TBadInputRow kRows[] = {
     {"key without value", L::Group(ClassWithCounter() + "<INSTANCE CLASSNAME=\"A\"/>"), 14,
      "doc.xml:3:26: found an instance of class \"A\" without a value for its key \"Id\"; every key needs one"},
     {"value out of range", L::Group(ClassWithCounter() + L::Instance("A", "1", L::Property("N", "uint8", "300"))), 13,
-     "doc.xml:3:142: found \"300\" as value of \"N\", expected a uint8"},
+     "doc.xml:3:142: found \"300\" in property \"N\" of class \"A\", expected a uint8 (instance A.Id=\"1\"); correct it, or have "
+     "such "
+     "values loaded as NULL or as text"},
     {"value of another type", L::Group(ClassWithCounter() + L::Instance("A", "1", L::Property("N", "string", "x"))), 13,
-     "doc.xml:3:149: found \"x\" of type string in property \"N\", which class \"A\" declares as uint8"},
+     "doc.xml:3:149: found \"x\" in property \"N\" of class \"A\", expected a uint8 (instance A.Id=\"1\"); correct it, or have "
+     "such "
+     "values loaded as NULL or as text"},
     {"property twice", L::Group(ClassWithCounter() + L::Instance("A", "1", L::Property("ID", "string", "2"))), 9,
      "doc.xml:3:100: found property \"ID\" a second time in one instance"},
     {"value twice", L::Group(L::Class("A", "<PROPERTY NAME=\"N\" TYPE=\"uint8\"><VALUE>1</VALUE><VALUE>2</VALUE></PROPERTY>")), 9,

@@ -74,7 +74,9 @@ const TDeclarationRow kRefusedRows[] = {
     {"a key that is no number",
      L::Group(Referring("<INSTANCENAME CLASSNAME=\"X\"><KEYBINDING NAME=\"K\"><KEYVALUE VALUETYPE=\"numeric\">many</KEYVALUE>"
                         "</KEYBINDING></INSTANCENAME>")),
-     "doc.xml:3:229: found \"many\" as the value of a key, expected a number"},
+     "doc.xml:3:229: found \"many\" in property \"K\" of class \"X\", expected a number (instance A.Id=\"1\"); correct it, or have "
+     "such "
+     "values loaded as NULL or as text"},
     {"two objects in one", L::Group("<VALUE.OBJECT><CLASS NAME=\"A\"/><CLASS NAME=\"B\"/></VALUE.OBJECT>"),
      "doc.xml:2:32: found a second object where one is expected"},
     {"a long name, cut between characters", L::Group(L::Instance(LongName(401), "1")),

@@ -1,0 +1,45 @@
+#pragma once
+
+#include <cstddef>
+#include <map>
+#include <string>
+#include <string_view>
+#include <utility>
+#include <vector>
+
+#include "embedded/load/TBadProperty.h"
+#include "host/TCIMReference.h"
+
+namespace NORVZEL20 {
+
+/// Counts the values of a load that do not fit their types, property by property, and describes the first one.
+///
+/// What fits costs nothing here. Memory: one record for each property that has such values. Errors: std::bad_alloc.
+class TBadValues {
+  public:
+    /// `found` gets a record for each property, in the order of their first values. It must outlive this.
+    explicit TBadValues(std::vector<TBadProperty>& found) noexcept : fFound(found) {}
+
+    /// Counts a value of the property that `first` names. Its other fields are kept if it is the first one; `instance` can be left
+    /// out, if `isInInstance` says that NameInstance is going to be called.
+    void Note(TBadProperty first, bool isInInstance);
+    bool HasAny() const noexcept { return !fFound.empty(); }
+
+    /// Whether records still lack the instance that their first value stands in.
+    bool LackInstance() const noexcept { return !fNameless.empty(); }
+    /// Ends the instance that the values since the last call stand in.
+    void NameInstance(const TCIMReference& path);
+    /// The same if it has no name yet.
+    void LeaveNameless() noexcept { fNameless.clear(); }
+
+    /// What was found first, how many values there are, and what can be done; without the place. `isWhole` says whether the load
+    /// has seen everything. Call it only if there are any.
+    std::string Describe(bool isWhole) const;
+
+  private:
+    std::vector<TBadProperty>& fFound;
+    std::map<std::pair<std::string, std::string>, std::size_t> fPositions;  // in fFound, by class and property
+    std::vector<std::size_t> fNameless;                                     // positions in fFound
+};
+
+}  // namespace NORVZEL20
