@@ -1,5 +1,7 @@
 #include "client/comparison/ReferenceStandIns.h"
 
+#include <algorithm>
+
 #include "client/inventory/CollectObjects.h"
 #include "embedded/store/TInMemInstance.h"
 #include "embedded/value/TValueText.h"
@@ -31,25 +33,53 @@ void PutIntoStatic(TInMemStaticProperty& shared)
     }
 }
 
-void PutInto(TInMemClass& cls, const std::string& property)
+void PutIntoSlot(TInMemClass& cls, std::uint32_t slot)
 {
-    const std::uint32_t slot = cls.GetLayout().FindSlot(property);
-    if (slot == TInMemLayout::kNoSlot || IsReference(cls.GetLayout().GetDecl(slot).GetType())) {
-        return;
-    }
     if (cls.GetLayout().GetDecl(slot).IsStatic()) {
         PutIntoStatic(cls.GetLayout().GetSharedDecl(slot)->GetStaticProperty());
         return;
     }
     for (const boost::shared_ptr<ICIMInstance>& instance : InstancesOf(cls)) {
         const auto& stored = static_cast<const TInMemInstance&>(*instance);  // an in-memory class has no other instances
-        if (!stored.GetSlotValue(slot).IsNull()) {
+        if (!stored.GetSlotValue(slot).IsNull() && !IsReference(stored.GetSlotValue(slot).GetType())) {
             stored.GetSlotProperty(slot).MarkStandIn(StandInFor(stored.GetSlotValue(slot)));
         }
     }
 }
 
+void PutInto(TInMemClass& cls, const std::string& property)
+{
+    const std::uint32_t slot = cls.GetLayout().FindSlot(property);
+    if (slot != TInMemLayout::kNoSlot && !IsReference(cls.GetLayout().GetDecl(slot).GetType())) {
+        PutIntoSlot(cls, slot);
+    }
+}
+
+void PutIntoReference(const TInMemNamespace& ns, const TBadProperty& bad)
+{
+    const boost::shared_ptr<TInMemClass> cls = ns.FindClass(bad.className);
+    const std::uint32_t slot = cls ? cls->GetLayout().FindSlot(bad.property) : TInMemLayout::kNoSlot;
+    if (bad.isKeptAsText && slot != TInMemLayout::kNoSlot && IsReference(cls->GetLayout().GetDecl(slot).GetType())) {
+        PutIntoSlot(*cls, slot);
+    }
+}
+
 }  // namespace
+
+bool KeepsText(const TInventory& inventory)
+{
+    const std::vector<TBadProperty>& found = inventory.loaded.badProperties;
+    return std::any_of(found.begin(), found.end(), [](const TBadProperty& bad) { return bad.isKeptAsText; });
+}
+
+void PutTextStandIns(const std::vector<TInventory>& inventories)
+{
+    for (const TInventory& inventory : inventories) {
+        for (const TBadProperty& bad : inventory.loaded.badProperties) {
+            PutIntoReference(*inventory.ns, bad);
+        }
+    }
+}
 
 void PutReferenceStandIns(const std::vector<TInventory>& inventories)
 {

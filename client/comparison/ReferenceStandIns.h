@@ -13,4 +13,11 @@ namespace NORVZEL20 {
 /// With stand-ins it finds that the values differ, as it does for any other two types. Errors: std::bad_alloc.
 void PutReferenceStandIns(const std::vector<TInventory>& inventories);
 
+/// Does the same for text that a load has kept in properties that are references (see TLoadOptions::badValues), in all inventories:
+/// the stand-ins of one text are equal. Cost: nothing for inventories without such text.
+void PutTextStandIns(const std::vector<TInventory>& inventories);
+
+/// Whether the load has kept text in the place of values that do not fit.
+bool KeepsText(const TInventory& inventory);
+
 }  // namespace NORVZEL20

@@ -79,6 +79,7 @@ TComparisonReport TComparison::Run(const std::optional<TRulesText>& rules, bool 
         fNotes = CompleteInventories(fInventories, fConsole);
         PutReferenceStandIns(fInventories);
     }
+    PutTextStandIns(fInventories);
     const TRulesText text =
         rules ? *rules
               : TRulesText{"the rules made for " + fInventories[0].path, MakeRulesForEverything(fInventories, fNotes), true};
@@ -171,12 +172,17 @@ void TComparison::RemoveMadeSystems(TDeltaNamespace& records)
 // Whether the run must not change the reference.
 //
 // With exactly two namespaces the plug-in brings the reference in line with the other one, instance by instance. That fails if keys
-// or types differ, and changes instances that are yet to be compared if a static value differs. Three namespaces are only read. So
-// if the other one is added twice, the reference stays as it is, and every record names two positions, of which one is removed.
+// or types differ or a value does not fit its type, and changes instances that are yet to be compared if a static value differs.
+// Three namespaces are only read. So if the other one is added twice, the reference stays as it is, and every record names two
+// positions, of which one is removed.
 bool TComparison::MustKeepReference() const
 {
     if (fInventories.size() != 2) {
         return false;
+    }
+    // The plug-in would give values the types that are declared.
+    if (std::any_of(fInventories.begin(), fInventories.end(), &KeepsText)) {
+        return true;
     }
     // With --strict-schema, the run is to report what does not fit.
     return StaticValuesDiffer(fInventories) ||

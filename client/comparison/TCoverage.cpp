@@ -50,7 +50,7 @@ bool TCoverage::IsCompleteButForTimes() const
 
 bool TCoverage::IsComplete(bool timesCount) const
 {
-    return !IsNothingCompared() &&
+    return !IsNothingCompared() && badValues.empty() &&
            std::all_of(classes.begin(), classes.end(), [timesCount](const TClass& cls) { return IsWhole(cls, timesCount); });
 }
 

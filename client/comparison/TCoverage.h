@@ -4,6 +4,7 @@
 #include <string>
 #include <vector>
 
+#include "client/inventory/TInventory.h"
 #include "client/inventory/TSchemaNote.h"
 
 namespace NORVZEL20 {
@@ -55,12 +56,19 @@ struct TCoverage {
         bool IsCompared() const;
     };
 
-    std::vector<TClass> classes;     ///< in ascending order of their names
-    std::size_t classesWithout = 0;  ///< classes without an instance in any inventory
-    std::vector<TSchemaNote> notes;  ///< what was done to make the inventories comparable, in that order
+    /// Values of one property of an inventory that do not fit their type.
+    struct TBadValues {
+        std::size_t inventory;
+        TBadProperty found;
+    };
+
+    std::vector<TClass> classes;        ///< in ascending order of their names
+    std::size_t classesWithout = 0;     ///< classes without an instance in any inventory
+    std::vector<TSchemaNote> notes;     ///< what was done to make the inventories comparable, in that order
+    std::vector<TBadValues> badValues;  ///< by inventory, then in the order of the files
 
     /// Whether there were instances to compare, and every instance of every inventory was compared in every property, references
-    /// as a whole.
+    /// as a whole, and every value as what its type says.
     bool IsComplete() const;
     /// The same, times of collection aside: a class whose default is to include is compared without them.
     bool IsCompleteButForTimes() const;

@@ -31,6 +31,11 @@ TCoverage TCoverageBuilder::Build()
     }
     TCoverage coverage;
     coverage.notes = fNotes;
+    for (std::size_t i = 0; i < fInventories.size(); ++i) {
+        for (const TBadProperty& found : fInventories[i].loaded.badProperties) {
+            coverage.badValues.push_back({i, found});
+        }
+    }
     for (const std::string& name : names) {
         AddClass(coverage, name);
     }

@@ -1,8 +1,11 @@
 #include "client/inventory/LoadFiles.h"
 
+#include <algorithm>
+
 #include "client/inventory/TSourceReader.h"
 #include "client/process/LackOfMemory.h"
 #include "client/process/TClientError.h"
+#include "client/text/DisplayText.h"
 #include "embedded/load/TLoadSession.h"
 #include "embedded/load/TPopulateError.h"
 
@@ -18,6 +21,10 @@ std::string NameOptions(EAdvice advice, const TLoadingOptions& options)
         return " with " + options.schemaOption + " FILE";
     case EAdvice::kGiveOrInferDeclaration:
         return " with " + options.schemaOption + " FILE, or let --infer-classes find it";
+    case EAdvice::kLetBadValuesPass:
+        return " with --bad-values null or --bad-values text";
+    case EAdvice::kKeepBadValuesAsText:
+        return " with --bad-values text";
     default:
         return "";
     }
@@ -48,6 +55,23 @@ void SayTolerated(const TLoadReport& report, IConsole& console)
         const std::string times = tolerated.count > 1 ? " (" + std::to_string(tolerated.count) + " times)" : "";
         console.Say("cimdelta: " + tolerated.document + ":" + std::to_string(tolerated.line) + ": tolerated: " + tolerated.text +
                     times);
+    }
+}
+
+void SayBadValues(const TLoadReport& report, IConsole& console)
+{
+    constexpr std::size_t kMost = 10;
+    const std::vector<TBadProperty>& found = report.badProperties;
+    for (std::size_t i = 0; i < std::min(kMost, found.size()); ++i) {
+        const TBadProperty& bad = found[i];
+        console.Say("cimdelta: " + bad.document + ":" + std::to_string(bad.line) + ":" + std::to_string(bad.column) +
+                    ": warning: " + QuoteForDisplay(bad.text) + " in " + EscapeForDisplay(bad.className + "." + bad.property) +
+                    " is no " + bad.type + "; " + (bad.isKeptAsText ? "kept as text" : "taken as NULL") +
+                    (bad.count > 1 ? " (" + std::to_string(bad.count) + " values)" : ""));
+    }
+    if (found.size() > kMost) {
+        console.Say("cimdelta: " + found[kMost].document + ": warning: values of " + std::to_string(found.size() - kMost) +
+                    " more properties do not fit their types");
     }
 }
 

@@ -26,4 +26,7 @@ TLoadReport LoadFiles(const TFilesToLoad& files, const TLoadOptions& load, const
 /// A message for each kind of fault that was tolerated.
 void SayTolerated(const TLoadReport& report, IConsole& console);
 
+/// A warning for each property with values that do not fit, up to ten.
+void SayBadValues(const TLoadReport& report, IConsole& console);
+
 }  // namespace NORVZEL20

@@ -25,8 +25,11 @@ boost::shared_ptr<const TInMemNamespace> LoadSchema(const TLoadingOptions& optio
     const TProgress progress(console, "loading the schema");
     TLoadOptions load;
     load.takesDeclarationsOnly = true;
+    load.badValues = options.badValues;
     const boost::shared_ptr<TInMemNamespace> schema = TInMemNamespace::Create("schema");
-    SayTolerated(LoadFiles({"the schema", options.schemaFiles, schema}, load, options), console);
+    const TLoadReport report = LoadFiles({"the schema", options.schemaFiles, schema}, load, options);
+    SayTolerated(report, console);
+    SayBadValues(report, console);
     return schema;
 }
 

@@ -38,6 +38,7 @@ std::vector<TLoadOptions> MakeLoadOptions(const TLoadingOptions& options, const 
     std::vector<TLoadOptions> loads;
     for (const std::string& label : labels) {
         TLoadOptions load;
+        load.badValues = options.badValues;
         const auto own = names.find(label);
         const auto common = names.find("");
         load.namespaceName = own != names.end() ? own->second : common != names.end() ? common->second : "";

@@ -125,6 +125,7 @@ std::vector<TInventory> TInventoryLoader::Load(const std::vector<TInventorySourc
     for (std::size_t i = 0; i < inventories.size(); ++i) {
         SayTolerated(inventories[i].loaded, fConsole);
         SayNamespaceDoubts(inventories[i], options[i].namespaceName, fConsole);
+        SayBadValues(inventories[i].loaded, fConsole);
     }
     return inventories;
 }

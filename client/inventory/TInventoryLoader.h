@@ -15,7 +15,8 @@ namespace NORVZEL20 {
 /// 16. The limit keeps few files open at a time.
 class TInventoryLoader {
   public:
-    /// `console` must outlive this. It shows the progress, and a message for each fault that was tolerated in a file.
+    /// `console` must outlive this. It shows the progress, and a message for each fault that was tolerated in a file
+    /// and for properties with values that do not fit.
     explicit TInventoryLoader(IConsole& console, TLoadingOptions options = {}) : fConsole(console), fOptions(std::move(options)) {}
 
     /// The inventories in the order of `sources`, which name standard input at most once.

@@ -3,6 +3,8 @@
 #include <string>
 #include <vector>
 
+#include "embedded/load/EBadValues.h"
+
 namespace NORVZEL20 {
 
 /// How the inventories of a command are loaded: the options that all commands share, as they were typed. A plain value.
@@ -17,6 +19,8 @@ struct TLoadingOptions {
     std::string schemaOption = "--schema";
     /// Whether classes that nothing declares are declared as their instances suggest.
     bool infersClasses = false;
+    /// What becomes of values that do not fit their types.
+    EBadValues badValues = EBadValues::kRefuse;
 };
 
 }  // namespace NORVZEL20

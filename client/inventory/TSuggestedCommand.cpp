@@ -76,6 +76,9 @@ TSuggestedCommand& TSuggestedCommand::AddLoading(const TLoadingOptions& options)
     for (const std::string& name : options.namespaces) {
         Add("--namespace").Add(name);
     }
+    if (options.badValues != EBadValues::kRefuse) {
+        Add("--bad-values").Add(options.badValues == EBadValues::kNull ? "null" : "text");
+    }
     for (const std::string& list : options.schemas) {
         Add("--declarations").Add(list);
     }

@@ -115,6 +115,23 @@ TJson JsonOfNote(const TComparisonReport& report, const TSchemaNote& note)
     return json;
 }
 
+TJson JsonOfBadValues(const TComparisonReport& report, const TCoverage::TBadValues& bad)
+{
+    const TBadProperty& first = bad.found;
+    return {{"inventory", report.labels[bad.inventory]},
+            {"class", first.className},
+            {"property", first.property},
+            {"values", first.count},
+            {"takenAs", first.isKeptAsText ? "text" : "null"},
+            {"first",
+             {{"text", first.text},
+              {"type", first.type},
+              {"instance", first.instance},
+              {"file", first.document},
+              {"line", first.line},
+              {"column", first.column}}}};
+}
+
 }  // namespace
 
 nlohmann::ordered_json JsonOfCoverage(const TComparisonReport& report)
@@ -127,7 +144,14 @@ nlohmann::ordered_json JsonOfCoverage(const TComparisonReport& report)
     for (const TSchemaNote& note : report.coverage.notes) {
         notes.push_back(JsonOfNote(report, note));
     }
-    return {{"classes", classes}, {"classesWithoutInstances", report.coverage.classesWithout}, {"schema", notes}};
+    TJson badValues = TJson::array();
+    for (const TCoverage::TBadValues& bad : report.coverage.badValues) {
+        badValues.push_back(JsonOfBadValues(report, bad));
+    }
+    return {{"classes", classes},
+            {"classesWithoutInstances", report.coverage.classesWithout},
+            {"schema", notes},
+            {"badValues", badValues}};
 }
 
 }  // namespace NORVZEL20

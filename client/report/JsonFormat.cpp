@@ -12,7 +12,10 @@
 //                                  "leftOutReasons": [ { "property": "Model", "reason": "excludedByRules" } ] } ],
 //                   "classesWithoutInstances": 0,
 //                   "schema": [ { "kind": "propertyDeclared", "inventory": "web02", "asIn": "web01", "class": "Disk",
-//                                 "property": "Model" } ] } }
+//                                 "property": "Model" } ],
+//                   "badValues": [ { "inventory": "web02", "class": "Disk", "property": "Size", "values": 2, "takenAs": "null",
+//                                    "first": { "text": "70000", "type": "uint16", "instance": "Disk.Id=\"sda\"",
+//                                               "file": "web02.xml", "line": 12, "column": 40 } } ] } }
 //
 // A class of which cimdelta made instances ends with "madeIn": [ "web02" ]. A note may end with "before": "model", the spelling
 // that was replaced, or with "declared": "Bag" and "declaredAsIn": "Ordered"; its kind decides, also whether it has "property".

@@ -8,6 +8,7 @@
 //   Properties of Disk used as keys, not compared as properties: Id.
 //   Instances of Disk with the key of an earlier one, since the rules leave out Bus: 2 of web01, not compared; ...
 //   References of Mount were compared without key Bus and without their namespace.
+//   Values of web02 that do not fit their types, taken as NULL: Disk.Size (2, the first "70000" for a uint16 at web02.xml:12).
 //   Declared in web02 as in web01: class Tape, Disk.Model.
 //   Made in web02: an instance of KALMO_OperatingSystem.
 //
@@ -41,6 +42,7 @@ class TStatement {
         WriteLeftOut();
         WriteSharing();
         WriteReferences();
+        WriteBadValues();
         WriteNotes();
         WriteNamespaces();
         WriteInferred();
@@ -176,6 +178,23 @@ class TStatement {
                 fOut += "References of " + EscapeForDisplay(cls.name) + " were compared " +
                         EscapeForDisplay(DescribeReducedReferences(cls.referenceKeys)) + ".\n";
             }
+        }
+    }
+
+    // One line for each inventory and each way to take them.
+    void WriteBadValues()
+    {
+        std::map<std::pair<std::size_t, bool>, std::vector<std::string>> found;
+        for (const TCoverage::TBadValues& bad : fCoverage.badValues) {
+            const TBadProperty& first = bad.found;
+            found[{bad.inventory, first.isKeptAsText}].push_back(
+                EscapeForDisplay(first.className + "." + first.property) + " (" + std::to_string(first.count) +
+                (first.count > 1 ? ", the first " : ": ") + QuoteForDisplay(first.text) + " for a " + first.type + " at " +
+                EscapeForDisplay(first.document) + ":" + std::to_string(first.line) + ")");
+        }
+        for (const auto& [where, properties] : found) {
+            fOut += "Values of " + Label(where.first) + " that do not fit their types, " +
+                    (where.second ? "compared as text" : "taken as NULL") + ": " + SomeOf(properties) + ".\n";
         }
     }
 

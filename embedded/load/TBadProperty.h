@@ -9,7 +9,8 @@ namespace NORVZEL20 {
 struct TBadProperty {
     std::string className;
     std::string property;
-    std::size_t count = 0;  ///< how many values
+    std::size_t count = 0;      ///< how many values
+    bool isKeptAsText = false;  ///< whether the load keeps them as text; otherwise they are NULL
 
     std::string text;      ///< what did not fit, cut if it is long
     std::string type;      ///< the type that it should have, as messages call it: "uint16"

@@ -72,6 +72,7 @@ void TLoadContext::NoteBadValue(const TBadValue& bad, const std::string& classNa
     first.text = TUtf8::Shorten(bad.text, kLongestText);
     first.text += first.text.size() < bad.text.size() ? "..." : "";
     first.type = bad.type;
+    first.isKeptAsText = isInInstance && fOptions.badValues == EBadValues::kText;
     first.document = NameOf(bad.place);
     first.line = bad.place.place.line;
     first.column = bad.place.place.column;
