@@ -16,8 +16,7 @@
 
 #include "embedded/store/TReferenceAdapter.h"
 
-#include <unordered_set>
-
+#include "embedded/store/FindDuplicate.h"
 #include "embedded/value/ChangeReferences.h"
 #include "embedded/value/TEmbeddedObject.h"
 #include "embedded/value/TValueAccess.h"
@@ -71,23 +70,6 @@ std::vector<std::uint32_t> FindSlotsToAdapt(const TInMemClass& cls)
         }
     }
     return slots;
-}
-
-/// The path that two instances of the class have, or an empty text.
-std::string FindDuplicate(TInMemClass& cls)
-{
-    std::unordered_set<std::string> paths;
-    std::string duplicate;
-    cls.EnumerateInstances(
-        [&](boost::shared_ptr<ICIMInstance> instance) {
-            std::string path = instance->GetReference(TCallContext()).GetPath();
-            if (!paths.insert(path).second) {
-                duplicate = std::move(path);
-            }
-            return duplicate.empty();
-        },
-        false, TCallContext());
-    return duplicate;
 }
 
 }  // namespace
