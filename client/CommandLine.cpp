@@ -13,6 +13,7 @@
 #include <exception>
 #include <sstream>
 
+#include "client/AddSystemNames.h"
 #include "client/BracketGuard.h"
 #include "client/TCommands.h"
 #include "client/WrongUsage.h"
@@ -79,6 +80,7 @@ class TCommandLine {
         if (!wrong.empty()) {
             return Refuse(wrong, console);
         }
+        arguments = JoinSelf(arguments);
         std::transform(arguments.begin(), arguments.end(), arguments.begin(), &GuardBrackets);
         std::reverse(arguments.begin(), arguments.end());  // CLI11 wants the last argument first
         try {

@@ -4,6 +4,7 @@
 #include <memory>
 
 #include "client/AddLoadingOptions.h"
+#include "client/AddSystemNames.h"
 #include "client/AddText.h"
 #include "client/BracketGuard.h"
 #include "client/commands/PrepareFiles.h"
@@ -115,6 +116,7 @@ void TCommands::AddCompare()
         ->option_text("RULES");
     AddFormat(command, fCompare.format);
     AddLoadingOptions(command, fCompare.loading, kSchemaNames);
+    AddSystemNames(command, fCompare.systems);
     AddOutput(command, fCompare.output);
     AddStrictSchema(command, fCompare.strictSchema);
     command->add_flag("--allow-empty", fCompare.allowEmpty, "do not take it for an error if nothing was compared");

@@ -1,6 +1,7 @@
 #include "client/commands/CompareCommand.h"
 
 #include "client/comparison/TComparison.h"
+#include "client/inventory/AlignSystemNames.h"
 #include "client/inventory/TInventoryLoader.h"
 #include "client/process/ExitStatus.h"
 #include "client/process/TClientError.h"
@@ -32,6 +33,7 @@ int RunCompare(const TCompareOptions& options, IConsole& console)
     // Before the inventories, which may take long to load.
     const std::optional<TRulesText> rules = ReadRulesIfAny(options.rules);
     std::vector<TInventory> inventories = TInventoryLoader(console, options.loading).Load(options.inventories);
+    AlignSystemNames(inventories, options.systems);
     const TComparisonReport report = TComparison(inventories, console).Run(rules, options.strictSchema);
     if (!options.allowEmpty && report.coverage.IsNothingCompared()) {
         throw TClientError(DescribeNothingCompared(report, inventories, options.rules, options.strictSchema));

@@ -5,6 +5,7 @@
 
 #include "client/inventory/TInventorySources.h"
 #include "client/inventory/TLoadingOptions.h"
+#include "client/inventory/TSystemNames.h"
 #include "client/process/IConsole.h"
 #include "client/report/EOutputFormat.h"
 
@@ -19,6 +20,7 @@ struct TCompareOptions {
     bool strictSchema = false;
     bool allowEmpty = false;  ///< whether it is no error if nothing was compared
     TLoadingOptions loading;
+    TSystemNames systems;
 };
 
 /// Compares inventories. Returns kExitSuccess (0) for no differences, otherwise kExitDifferences (1). Errors: TClientError, also if

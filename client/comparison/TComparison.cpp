@@ -11,6 +11,7 @@
 #include <algorithm>
 #include <set>
 
+#include "client/comparison/FindNameHint.h"
 #include "client/comparison/ReadDeltaRecords.h"
 #include "client/comparison/ReferenceStandIns.h"
 #include "client/comparison/RefuseRecordKeys.h"
@@ -103,6 +104,7 @@ TComparisonReport TComparison::RunWith(const std::shared_ptr<TRules>& rules, con
         report.loads.push_back(inventory.loaded);
     }
     report.coverage = TCoverageBuilder(fInventories, *rules, fNotes).Build();
+    report.coverage.hint = FindNameHint(fInventories, *rules, fNotes);
     report.idleRules = text.isMade ? std::vector<std::string>() : FindIdleRules(rules->GetDocument());
     report.records = MakeDeltaNamespace();
     if (rules->HasExcludedKeys()) {

@@ -1,9 +1,11 @@
 #pragma once
 
 #include <cstddef>
+#include <optional>
 #include <string>
 #include <vector>
 
+#include "client/comparison/TNameHint.h"
 #include "client/inventory/TInventory.h"
 #include "client/inventory/TSchemaNote.h"
 
@@ -62,10 +64,18 @@ struct TCoverage {
         TBadProperty found;
     };
 
+    /// A system that an inventory calls otherwise than the reference.
+    struct TName {
+        std::size_t inventory;
+        TOwnName name;
+    };
+
     std::vector<TClass> classes;        ///< in ascending order of their names
     std::size_t classesWithout = 0;     ///< classes without an instance in any inventory
     std::vector<TSchemaNote> notes;     ///< what was done to make the inventories comparable, in that order
     std::vector<TBadValues> badValues;  ///< by inventory, then in the order of the files
+    std::vector<TName> names;           ///< by inventory, if keys or references were changed
+    std::optional<TNameHint> hint;      ///< a class of which nothing matches because systems are called differently
 
     /// Whether there were instances to compare, and every instance of every inventory was compared in every property, references
     /// as a whole, and every value as what its type says.

@@ -35,6 +35,11 @@ TCoverage TCoverageBuilder::Build()
         for (const TBadProperty& found : fInventories[i].loaded.badProperties) {
             coverage.badValues.push_back({i, found});
         }
+        for (const TOwnName& name : fInventories[i].ownNames) {
+            if (name.replaced + name.marked > 0) {
+                coverage.names.push_back({i, name});
+            }
+        }
     }
     for (const std::string& name : names) {
         AddClass(coverage, name);

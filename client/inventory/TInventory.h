@@ -5,6 +5,7 @@
 #include <vector>
 
 #include "client/inventory/TLoadingOptions.h"
+#include "client/inventory/TOwnName.h"
 #include "embedded/load/TLoadReport.h"
 #include "embedded/store/TInMemNamespace.h"
 
@@ -18,6 +19,7 @@ struct TInventory {
     std::string label;               ///< what reports call it; see MakeInventoryLabels
     boost::shared_ptr<TInMemNamespace> ns;
     TLoadReport loaded;
+    std::vector<TOwnName> ownNames = {};  ///< the names of systems that were written as the reference has them
 };
 
 }  // namespace NORVZEL20

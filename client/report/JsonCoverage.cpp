@@ -132,6 +132,29 @@ TJson JsonOfBadValues(const TComparisonReport& report, const TCoverage::TBadValu
               {"column", first.column}}}};
 }
 
+TJson JsonOfName(const TComparisonReport& report, const TCoverage::TName& entry)
+{
+    TJson within = TJson::array();
+    for (const auto& [key, count] : entry.name.within) {
+        within.push_back({{"key", key}, {"texts", count}});
+    }
+    return {{"inventory", report.labels[entry.inventory]}, {"name", entry.name.name},
+            {"comparedAs", entry.name.comparedAs},         {"texts", entry.name.replaced},
+            {"anotherSystem", entry.name.marked},          {"withinLongerTexts", within}};
+}
+
+TJson JsonOfHints(const TCoverage& coverage)
+{
+    TJson hints = TJson::array();
+    if (coverage.hint) {
+        hints.push_back({{"kind", "systemName"},
+                         {"class", coverage.hint->className},
+                         {"property", coverage.hint->property},
+                         {"instances", coverage.hint->instances}});
+    }
+    return hints;
+}
+
 }  // namespace
 
 nlohmann::ordered_json JsonOfCoverage(const TComparisonReport& report)
@@ -148,10 +171,13 @@ nlohmann::ordered_json JsonOfCoverage(const TComparisonReport& report)
     for (const TCoverage::TBadValues& bad : report.coverage.badValues) {
         badValues.push_back(JsonOfBadValues(report, bad));
     }
-    return {{"classes", classes},
-            {"classesWithoutInstances", report.coverage.classesWithout},
-            {"schema", notes},
-            {"badValues", badValues}};
+    TJson names = TJson::array();
+    for (const TCoverage::TName& name : report.coverage.names) {
+        names.push_back(JsonOfName(report, name));
+    }
+    return {{"classes", classes},   {"classesWithoutInstances", report.coverage.classesWithout},
+            {"schema", notes},      {"badValues", badValues},
+            {"systemNames", names}, {"hints", JsonOfHints(report.coverage)}};
 }
 
 }  // namespace NORVZEL20

@@ -15,7 +15,11 @@
 //                                 "property": "Model" } ],
 //                   "badValues": [ { "inventory": "web02", "class": "Disk", "property": "Size", "values": 2, "takenAs": "null",
 //                                    "first": { "text": "70000", "type": "uint16", "instance": "Disk.Id=\"sda\"",
-//                                               "file": "web02.xml", "line": 12, "column": 40 } } ] } }
+//                                               "file": "web02.xml", "line": 12, "column": 40 } } ],
+//                   "systemNames": [ { "inventory": "web02", "name": "web02", "comparedAs": "web01", "texts": 706,
+//                                      "anotherSystem": 0,
+//                                      "withinLongerTexts": [ { "key": "Port.Id", "texts": 2 } ] } ],
+//                   "hints": [ { "kind": "systemName", "class": "Disk", "property": "SystemName", "instances": [ 1, 1 ] } ] } }
 //
 // A class of which cimdelta made instances ends with "madeIn": [ "web02" ]. A note may end with "before": "model", the spelling
 // that was replaced, or with "declared": "Bag" and "declaredAsIn": "Ordered"; its kind decides, also whether it has "property".

@@ -8,9 +8,11 @@
 //   Properties of Disk used as keys, not compared as properties: Id.
 //   Instances of Disk with the key of an earlier one, since the rules leave out Bus: 2 of web01, not compared; ...
 //   References of Mount were compared without key Bus and without their namespace.
+//   Compared as "web01" in keys and references of web02: "web02" (706 times).
 //   Values of web02 that do not fit their types, taken as NULL: Disk.Size (2, the first "70000" for a uint16 at web02.xml:12).
 //   Declared in web02 as in web01: class Tape, Disk.Model.
 //   Made in web02: an instance of KALMO_OperatingSystem.
+//   Hint: 0 of 350 instances of Disk match; SystemName has one value in each inventory: try --self SystemName.
 //
 // Numbers with slashes between them are those of the inventories, the reference first.
 #include "client/report/TextCoverage.h"
@@ -42,10 +44,12 @@ class TStatement {
         WriteLeftOut();
         WriteSharing();
         WriteReferences();
+        WriteNames();
         WriteBadValues();
         WriteNotes();
         WriteNamespaces();
         WriteInferred();
+        WriteHint();
         return fOut;
     }
 
@@ -181,6 +185,36 @@ class TStatement {
         }
     }
 
+    void WriteNames()
+    {
+        for (const TCoverage::TName& entry : fCoverage.names) {
+            const TOwnName& own = entry.name;
+            const std::string used = QuoteForDisplay(own.comparedAs);
+            if (own.replaced > 0) {
+                fOut += "Compared as " + used + " in keys and references of " + Label(entry.inventory) + ": " +
+                        QuoteForDisplay(own.name) + " (" + Counted(own.replaced, "time") + ").\n";
+            }
+            if (own.marked > 0) {
+                fOut += "Another system that " + Label(entry.inventory) + " calls " + used + " is shown as " +
+                        QuoteForDisplay(own.comparedAs + kAnotherSystem) + " (" + Counted(own.marked, "time") + ").\n";
+            }
+            WriteNamesWithin(entry);
+        }
+    }
+
+    void WriteNamesWithin(const TCoverage::TName& entry)
+    {
+        std::vector<std::string> keys;
+        for (const auto& [key, count] : entry.name.within) {
+            keys.push_back(EscapeForDisplay(key) + " (" + std::to_string(count) + ")");
+        }
+        if (!keys.empty()) {
+            fOut += "Keys of " + Label(entry.inventory) + " that hold " + QuoteForDisplay(entry.name.name) +
+                    " within a longer text were left as they are, so their instances match only under rules that exclude them: " +
+                    SomeOf(keys) + ".\n";
+        }
+    }
+
     // One line for each inventory and each way to take them.
     void WriteBadValues()
     {
@@ -207,6 +241,17 @@ class TStatement {
                 fOut += line + ".\n";
             }
         }
+    }
+
+    void WriteHint()
+    {
+        if (!fCoverage.hint) {
+            return;
+        }
+        const TNameHint& hint = *fCoverage.hint;
+        fOut += "Hint: 0 of " + Counted(hint.instances.front(), "instance") + " of " + EscapeForDisplay(hint.className) +
+                " match; " + EscapeForDisplay(hint.property) + " has one value in each inventory: try --self " +
+                EscapeForDisplay(hint.property) + ".\n";
     }
 
     // There may be hundreds of declarations, so they are listed in one line for each pair of inventories.

@@ -63,7 +63,7 @@ TEST_F(UsageTest, WrongUsageIsReportedInOneLine)
         {{"help", "help", "show", "check"}, "show is one argument too many; see cimdelta --help"},
         {{"help", "--nonsense"}, "--nonsense is one argument too many; see cimdelta --help"},
         {{"help", "compare", "--nonsense"}, "--nonsense is one argument too many; see cimdelta --help"},
-        {{"compare", "--self", "web01.xml", "web02.xml"}, "--self is no option of cimdelta compare; see cimdelta compare --help"},
+        {{"compare", "--own", "web01.xml", "web02.xml"}, "--own is no option of cimdelta compare; see cimdelta compare --help"},
         {{"help", "merge"}, std::string("merge is no command; name one: ") + kCommands},
         {{"web01.xml", "web02.xml"}, std::string("web01.xml is no command; name one: ") + kCommands},
         {{"--verson"}, "--verson is no option of cimdelta; did you mean --version?"},

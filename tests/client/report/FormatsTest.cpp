@@ -48,7 +48,7 @@ TEST_F(FormatsTest, NdjsonHasADocumentForEachDifferenceAndOneForTheCoverage)
             CoveredClass("INV_Package", "reachedByNoElement", "3,3,4", "0,0,0") + "," +
             CoveredClass("INV_Service", "compared", "1,1,1", "1,1,1") + "," +
             CoveredClass("KALMO_OperatingSystem", "reachedByNoElement", "1,1,1", "0,0,0") +
-            "],\"classesWithoutInstances\":1,\"schema\":[],\"badValues\":[]}\n",
+            "],\"classesWithoutInstances\":1,\"schema\":[],\"badValues\":[],\"systemNames\":[],\"hints\":[]}\n",
         Result({"compare", "-o", "ndjson", "--spec",
                 Scratch("rules", "<DifftoolSpec><class name='INV_Disk' default='include'/><class name='INV_Element' "
                                  "default='include'/></DifftoolSpec>"),

@@ -1,0 +1,195 @@
+#include "client/inventory/AlignSystemNames.h"
+
+#include <algorithm>
+#include <map>
+#include <set>
+#include <string>
+#include <utility>
+
+#include "client/inventory/FindOwnName.h"
+#include "client/inventory/TNameReplacement.h"
+#include "client/process/TClientError.h"
+#include "client/text/DisplayText.h"
+#include "embedded/store/TKeyTexts.h"
+#include "embedded/value/TNameText.h"
+
+namespace NORVZEL20 {
+
+namespace {
+
+// Names that mean one system, in the order of the options.
+using TNames = std::vector<std::string>;
+
+TNames Split(const std::string& option)
+{
+    TNames names;
+    for (std::size_t start = 0; start <= option.size();) {
+        const std::size_t end = std::min(option.find('=', start), option.size());
+        names.push_back(option.substr(start, end - start));
+        start = end + 1;
+    }
+    if (names.size() < 2 || std::count(names.begin(), names.end(), "") > 0) {
+        throw TClientError("--same " + EscapeForDisplay(option) +
+                           " is no list of names; join names that mean one system by equals signs: --same web01=web02");
+    }
+    return names;
+}
+
+bool HasName(const TNames& names, const std::string& name)
+{
+    return std::any_of(names.begin(), names.end(), [&name](const std::string& known) { return TNameText::Equal(known, name); });
+}
+
+// Options with a common name are about one system.
+std::vector<TNames> ReadSame(const std::vector<std::string>& options)
+{
+    std::vector<TNames> systems;
+    for (const std::string& option : options) {
+        TNames names = Split(option);
+        for (auto system = systems.begin(); system != systems.end();) {
+            const bool isSame =
+                std::any_of(names.begin(), names.end(), [&](const std::string& name) { return HasName(*system, name); });
+            if (isSame) {
+                names.insert(names.begin(), system->begin(), system->end());
+            }
+            system = isSame ? systems.erase(system) : system + 1;
+        }
+        TNames once;
+        for (const std::string& name : names) {
+            if (!HasName(once, name)) {
+                once.push_back(name);
+            }
+        }
+        systems.push_back(once);
+    }
+    return systems;
+}
+
+// How often an inventory has each text in its keys and references, in the spelling that comes first. Only texts of `asked` count.
+TNameMap<std::size_t> CountNames(const TInventory& inventory, const std::vector<TNames>& asked)
+{
+    TNameMap<std::size_t> counts;
+    TKeyTexts(*inventory.ns).Change([&](std::string_view text, const TKeyTexts::TPlace&) {
+        const std::string name(text);
+        if (std::any_of(asked.begin(), asked.end(), [&name](const TNames& names) { return HasName(names, name); })) {
+            ++counts[name];
+        }
+        return TCIMValue();
+    });
+    return counts;
+}
+
+// Finds the own names of inventories among names that mean the same.
+class TSameNames {
+  public:
+    TSameNames(std::vector<TInventory>& inventories, const std::vector<std::string>& options)
+        : fInventories(inventories), fSystems(ReadSame(options))
+    {
+        for (const TInventory& inventory : fInventories) {
+            fCounts.push_back(CountNames(inventory, fSystems));
+        }
+    }
+
+    // Gives each inventory its own names.
+    void Run()
+    {
+        for (const TNames& names : fSystems) {
+            const std::string used = FindOwn(0, names);
+            if (used.empty()) {
+                throw TClientError(fInventories[0].path + ": has none of the names " + Listed(names) +
+                                   " in its keys and references; it is the reference, whose name all get");
+            }
+            for (std::size_t i = 0; i < fInventories.size(); ++i) {
+                const std::string own = i == 0 ? used : FindOwn(i, names);
+                if (!own.empty()) {
+                    fInventories[i].ownNames.push_back({own, used, 0, 0, {}});
+                }
+            }
+            RequireAll(names);
+        }
+    }
+
+  private:
+    static std::string Listed(const TNames& names)
+    {
+        std::string list;
+        for (const std::string& name : names) {
+            list += (list.empty() ? "" : ", ") + DisplayLabel(name);
+        }
+        return list;
+    }
+
+    // The inventory's own name as it spells it; empty if it has none of them.
+    std::string FindOwn(std::size_t inventory, const TNames& names)
+    {
+        const TNameMap<std::size_t>& counts = fCounts[inventory];
+        auto own = counts.end();
+        for (const std::string& name : names) {
+            const auto found = counts.find(name);
+            if (found != counts.end() && (own == counts.end() || found->second > own->second)) {
+                own = found;
+            }
+        }
+        if (own != counts.end()) {
+            return own->first;
+        }
+        if (!HasName(names, fInventories[inventory].label)) {
+            return std::string();
+        }
+        fLabels.insert(fInventories[inventory].label);
+        return FindOwnName(fInventories[inventory], kSystemNameProperty);
+    }
+
+    // A name that is nowhere is a mistake in writing.
+    void RequireAll(const TNames& names) const
+    {
+        for (const std::string& name : names) {
+            const bool isSomewhere =
+                fLabels.count(name) > 0 ||
+                std::any_of(fCounts.begin(), fCounts.end(), [&name](const auto& counts) { return counts.count(name) > 0; });
+            if (!isSomewhere) {
+                throw TClientError("no inventory has the name " + DisplayLabel(name) +
+                                   " of --same in its keys and references, nor as its label; letter case does not count");
+            }
+        }
+    }
+
+    std::vector<TInventory>& fInventories;
+    std::vector<TNames> fSystems;
+    std::vector<TNameMap<std::size_t>> fCounts;  // of each inventory
+    std::set<std::string, TNameText::TLess> fLabels;
+};
+
+void Replace(TInventory& inventory)
+{
+    TNameReplacement replacement(inventory.ownNames);
+    const std::string twice = TKeyTexts(*inventory.ns).Change([&](std::string_view text, const TKeyTexts::TPlace& place) {
+        return replacement.Replace(text, place);
+    });
+    if (!twice.empty()) {
+        throw TClientError(inventory.path + ": two instances would be " + twice +
+                           " with the system's name as the reference has it; they differ only in the letter case of that name");
+    }
+}
+
+}  // namespace
+
+void AlignSystemNames(std::vector<TInventory>& inventories, const TSystemNames& options)
+{
+    if (!options.self.empty()) {
+        const std::string used = FindOwnName(inventories.front(), options.self);
+        for (TInventory& inventory : inventories) {
+            inventory.ownNames.push_back({FindOwnName(inventory, options.self), used, 0, 0, {}});
+        }
+    }
+    if (!options.same.empty()) {
+        TSameNames(inventories, options.same).Run();
+    }
+    for (TInventory& inventory : inventories) {
+        if (!inventory.ownNames.empty()) {
+            Replace(inventory);
+        }
+    }
+}
+
+}  // namespace NORVZEL20

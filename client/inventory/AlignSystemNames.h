@@ -1,0 +1,20 @@
+#pragma once
+
+#include <vector>
+
+#include "client/inventory/TInventory.h"
+#include "client/inventory/TSystemNames.h"
+
+namespace NORVZEL20 {
+
+/// Writes the names by which the inventories call their own systems as the reference has them, in keys and references, and notes in
+/// TInventory::ownNames what was done. Does nothing without such options. Call it before the schemas are completed.
+///
+/// Of several names that mean one system, an inventory's own is the one that it has most often in keys and references; of the
+/// reference, it is the one that is used for all. A name that an inventory does not have may be its label instead: its own name is
+/// then looked for as by `self`. Errors: TClientError if no own name is found, a name is found nowhere, or two instances would have
+/// the same keys; std::bad_alloc. Other inventories may be changed by then.
+/// Cost: some passes over the keys and references of each inventory.
+void AlignSystemNames(std::vector<TInventory>& inventories, const TSystemNames& options);
+
+}  // namespace NORVZEL20
