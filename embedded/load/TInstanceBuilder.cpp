@@ -304,6 +304,9 @@ void TInstanceBuilder::CheckKey(const TLoadTarget& target, const TCIMValue& valu
     TCIMValue converted = value;
     TReferenceAdapter(fNamespace).ConvertKey(fLayout->cls->GetLayout().GetDecl(target.slot), value, converted);
     TReferenceAdapter(fNamespace).Adapt(converted);
+    if (there.GetType() != target.type) {  // text that was kept because it does not fit; the name may write it with another type
+        converted = AsText(converted);
+    }
     DropPlaces(converted);
     DropPlaces(there);
     if (!there.IsSameKey(converted)) {

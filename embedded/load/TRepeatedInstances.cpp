@@ -15,9 +15,7 @@ namespace {
 
 std::string ShowPath(const TInMemInstance& instance)
 {
-    constexpr std::size_t kLongestPath = 200;
-    const std::string path = instance.GetReference().ToText();
-    return path.size() > kLongestPath ? Quote(path) : path;
+    return QuoteIfLong(instance.GetReference().ToText());
 }
 
 boost::shared_ptr<TInMemInstance> FindFirst(const TInMemInstance& repeated)

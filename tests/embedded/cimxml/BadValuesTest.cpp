@@ -225,8 +225,23 @@ TEST_F(BadValuesTest, AKeyIsKeptAsText)
 
 TEST_F(BadValuesTest, TwoInstancesWithTheSameTextAsKeyAreTheSame)
 {
-    EXPECT_EQ("12 doc.xml:4:100: found a second instance root/cimv2:K.Id=\"x\"; instances of class \"K\" must differ in their keys",
+    EXPECT_EQ("K.Id 2: \"x\" is no uint16, doc.xml:3:81, K.Id=\"x\"\n",
               Load(EBadValues::kText, kNumbered + NumberedInstance("x") + NumberedInstance("x")));
+    EXPECT_EQ("root/cimv2:K.Id=\"x\"\n", fLoading.PathsOf("K"));
+}
+
+/// The name in front of an instance may write the key with another type.
+TEST_F(BadValuesTest, AKeptKeyAgreesWithTheNameInFront)
+{
+    const auto named = [](const std::string& name) {
+        return "<VALUE.NAMEDOBJECT><INSTANCENAME CLASSNAME=\"K\"><KEYBINDING NAME=\"Id\"><KEYVALUE VALUETYPE=\"numeric\">" + name +
+               "</KEYVALUE></KEYBINDING></INSTANCENAME><INSTANCE CLASSNAME=\"K\">" + L::Property("Id", "uint16", "70000") +
+               "</INSTANCE></VALUE.NAMEDOBJECT>\n";
+    };
+    const std::string found = Load(EBadValues::kText, kNumbered + named("70000"));
+    EXPECT_EQ("K.Id 1: \"70000\" is no uint16", found.substr(0, found.find(", doc.xml")));
+    EXPECT_EQ("root/cimv2:K.Id=\"70000\"\n", fLoading.PathsOf("K"));
+    EXPECT_EQ("9", Load(EBadValues::kText, kNumbered + named("80000")).substr(0, 1));
 }
 
 /// A number that is generated for others stays free of what is none.
