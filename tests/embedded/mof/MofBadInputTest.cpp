@@ -112,7 +112,8 @@ const TBadMofRow kMistakes[] = {
     {"a property twice", "instance of Disk { Id = \"a\";\n ID = \"b\"; };", 9,
      "doc.mof:7:2: found property \"ID\" a second time in one instance"},
     {"a value out of range", "instance of Disk { Id = \"a\"; Size = 256; };", 13,
-     "doc.mof:6:30: found \"256\" of type uint64 in property \"Size\", which class \"Disk\" declares as uint8"},
+     "doc.mof:6:30: found \"256\" in property \"Size\" of class \"Disk\", expected a uint8 (instance Disk.Id=\"a\"); "
+     "correct it, or have such values loaded as NULL or as text"},
     {"no key", "instance of Disk { Size = 1; };", 14,
      "doc.mof:6:1: found an instance of class \"Disk\" without a value for its key \"Id\"; every key needs one"},
     {"an instance twice, with other values", "instance of Disk { Id = \"a\"; };\ninstance of Disk { Id = \"a\"; Size = 2; };", 12,
@@ -120,7 +121,8 @@ const TBadMofRow kMistakes[] = {
      "has "
      "NULL; remove one of the two"},
     {"a path without a class", "instance of Disk { Id = \"a\"; On = \".Id=1\"; };", 13,
-     "doc.mof:6:30: found \".Id=1\" of type string in property \"On\", which class \"Disk\" declares as reference"},
+     "doc.mof:6:30: found \".Id=1\" in property \"On\" of class \"Disk\", expected a reference (instance Disk.Id=\"a\"); "
+     "correct it, or have such values loaded as NULL or as text"},
     {"an unknown alias", "instance of Disk { Id = \"a\"; On = $B; };", 15,
      "doc.mof:6:30: found the alias $B, but no instance of the document has it; declare one \"as $B\""},
     {"an alias twice", "instance of Disk as $A { Id = \"a\"; };\ninstance of Disk as $a { Id = \"b\"; };", 9,
