@@ -119,6 +119,10 @@ void TCommands::AddCompare()
     AddSystemNames(command, fCompare.systems);
     AddOutput(command, fCompare.output);
     AddStrictSchema(command, fCompare.strictSchema);
+    command->add_flag("--detail", fCompare.text.isDetailed, "show each difference on its own, and all of the coverage");
+    command->add_flag("--coverage", fCompare.text.hasWholeCoverage, "show all of what was compared and what not");
+    command->add_option("--limit", fCompare.text.mostLines, "shorten groups so that the findings take at most so many lines")
+        ->option_text("LINES");
     command->add_flag("--allow-empty", fCompare.allowEmpty, "do not take it for an error if nothing was compared");
 }
 

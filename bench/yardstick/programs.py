@@ -1,6 +1,7 @@
 """The programs that take part: builds of cimdelta with their bench_steps, and the peers."""
 import dataclasses
 import pathlib
+import subprocess
 
 import counting
 import measuring
@@ -42,8 +43,15 @@ class Build:
 
     def report(self, files, output, form="ndjson"):
         output = f"{output}-{pathlib.Path(files[0]).stem}.{self.name}.{form}"
-        arguments = (self.folder / "cimdelta", "compare", "-o", form, "--output", output, *files)
+        arguments = (self.folder / "cimdelta", "compare", "-o", form, *self._detail(form), "--output", output, *files)
         return Command(_texts(arguments), _question(files), form, output, (DIFFERENCES,))
+
+    def _detail(self, form):
+        """The option that makes a text show every difference, as other formats do. Earlier builds have no other text."""
+        if form != "text":
+            return ()
+        told = subprocess.run([self.folder / "cimdelta", "help", "compare"], stdout=subprocess.PIPE, text=True, check=True).stdout
+        return ("--detail",) if "--detail" in told else ()
 
     def compare(self, files, rules):
         return Command(_texts((self.folder / "bench_steps", "--spec", rules, *files)), _question(files))

@@ -15,7 +15,7 @@ int RunCheck(const TCheckOptions& options, IConsole& console)
     std::vector<TInventory> inventories = TInventoryLoader(console, options.loading).Load(options.schemas);
     std::vector<TSchemaNote> notes;
     if (!options.strictSchema && !inventories.empty()) {
-        notes = CompleteInventories(inventories, console);
+        notes = CompleteInventories(inventories);
     }
     DeliverResult(console, options.output, TRulesListing(*rules, inventories, notes, options.strictSchema).WriteCheck());
     return kExitSuccess;

@@ -20,8 +20,9 @@ void Deliver(const TComparisonReport& report, const TCompareOptions& options, IC
     TResultOutput output(console, options.output);
     {
         const TProgress progress(console, "writing the report");
-        const bool isColored = console.IsColored() && IsStandardOutput(options.output);
-        WriteReport(report, options.format, isColored, [&output](std::string_view piece) { output.Write(piece); });
+        TTextOptions text = options.text;
+        text.isColored = console.IsColored() && IsStandardOutput(options.output);
+        WriteReport(report, options.format, text, [&output](std::string_view piece) { output.Write(piece); });
     }
     output.Deliver();
 }

@@ -8,6 +8,7 @@
 #include "client/inventory/TSystemNames.h"
 #include "client/process/IConsole.h"
 #include "client/report/EOutputFormat.h"
+#include "client/report/TTextOptions.h"
 
 namespace NORVZEL20 {
 
@@ -16,6 +17,7 @@ struct TCompareOptions {
     std::vector<TInventorySources> inventories;  ///< at least two, the reference first
     std::string rules;                           ///< empty: everything is compared
     EOutputFormat format = EOutputFormat::kText;
+    TTextOptions text;   ///< whether it is coloured is found out by the command
     std::string output;  ///< empty: standard output
     bool strictSchema = false;
     bool allowEmpty = false;  ///< whether it is no error if nothing was compared

@@ -40,7 +40,7 @@ int RunExplain(const TExplainOptions& options, IConsole& console)
     std::vector<TInventory> inventories = TInventoryLoader(console, options.loading).Load(options.schemas);
     std::vector<TSchemaNote> notes;
     if (!options.strictSchema) {
-        notes = CompleteInventories(inventories, console);
+        notes = CompleteInventories(inventories);
     }
     TRulesListing listing(rules ? *rules : TRulesText{"", MakeRulesForEverything(inventories, notes), true}, inventories, notes,
                           options.strictSchema);

@@ -77,7 +77,7 @@ TComparisonReport TComparison::Run(const std::optional<TRulesText>& rules, bool 
     if (strictSchema) {
         fNotes = InspectInventories(fInventories);
     } else {
-        fNotes = CompleteInventories(fInventories, fConsole);
+        fNotes = CompleteInventories(fInventories);
         PutReferenceStandIns(fInventories);
     }
     PutTextStandIns(fInventories);
@@ -98,6 +98,8 @@ TComparisonReport TComparison::RunWith(const std::shared_ptr<TRules>& rules, con
 {
     const TProgress progress(fConsole, "comparing");
     TComparisonReport report;
+    report.inventories = &fInventories;
+    report.rules = text.name;
     for (const TInventory& inventory : fInventories) {
         report.labels.push_back(inventory.label);
         report.paths.push_back(inventory.path);

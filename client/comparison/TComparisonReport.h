@@ -17,8 +17,10 @@ struct TComparisonReport {
     std::vector<std::string> labels;  ///< of the inventories; the first one is the reference
     std::vector<std::string> paths;   ///< of the inventories, in the same order
     std::vector<TLoadReport> loads;   ///< what was found when they were loaded, in the same order
+    std::string rules;                ///< what messages call the rules
     TCoverage coverage;
     std::vector<std::string> idleRules;  ///< the classes that a rules file names although no inventory has instances of their trees
+    const std::vector<TInventory>* inventories;    ///< those that were compared; they must outlive this
     boost::shared_ptr<TDeltaNamespace> records;    ///< the delta namespace of the run
     std::shared_ptr<TDifferenceList> differences;  ///< what the records stand for; reads the inventories
 };

@@ -32,6 +32,9 @@ struct TDifference {
     /// Of kChanged: the property, and nothing else. Of kOnlyInOthers: each compared property in which the instances of
     /// `inventories` differ from one another, ascending by name.
     std::vector<TValueDifference> values;
+    /// Of an instance that only one side has: the compared properties that are not null and no keys, in the order of the class,
+    /// with the values of the reference or of the first of `inventories`.
+    std::vector<std::pair<std::string, TCIMValue>> contents;
 
     /// The instance's key without the class: `Key1="v",Key2=5`; empty if the class has no keys or the rules exclude all of them.
     std::string GetKeyText() const

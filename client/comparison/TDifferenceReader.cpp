@@ -65,6 +65,16 @@ TCIMValue InFormOf(const TInMemPropertyDecl& declared, const TCIMValue& value)
                          : value;
 }
 
+std::vector<std::string> WithoutKeys(std::vector<std::string> properties, const TInMemClass& cls)
+{
+    const std::vector<std::string> keys = KeyNamesOf(cls);
+    properties.erase(
+        std::remove_if(properties.begin(), properties.end(),
+                       [&keys](const std::string& name) { return std::find(keys.begin(), keys.end(), name) != keys.end(); }),
+        properties.end());
+    return properties;
+}
+
 }  // namespace
 
 void TDifferenceReader::StartClass(const std::string& className)
@@ -78,6 +88,7 @@ void TDifferenceReader::StartClass(const std::string& className)
     fByPath.reset();
     fClass = fInventories[0].ns->FindClass(className);
     fProperties = fRules.PropertiesOf(fClass);
+    fContents = WithoutKeys(fProperties, *fClass);
     std::sort(fProperties.begin(), fProperties.end());
     fExcludesKeys = !fRules.ExcludedKeysOf(className).empty();
     fHasKeys = !KeyNamesOf(*fClass).empty();
@@ -99,10 +110,12 @@ TDifference TDifferenceReader::Read(const ICIMInstance& delta)
         instance = FindByPath(difference.instance);
         difference.path = fExcludesKeys ? std::move(difference.instance) : std::string();
         difference.instance = fRules.KeyOf(fClassName, instance);
+        AddContents(difference, *instance);
         break;
     case TDeltaNamespace::kInstanceAdded:
         difference.kind = TDifference::kOnlyInOthers;
         instance = Index(difference.inventories.front()).Find(difference.instance).at(0);
+        AddContents(difference, *instance);
         AddDisagreements(difference);
         break;
     case TDeltaNamespace::kPropertyChanged:
@@ -174,6 +187,16 @@ void TDifferenceReader::AddKeys(TDifference& difference, const ICIMInstance& ins
     difference.keys.reserve(fKeys.size());
     for (const std::string& name : fKeys) {
         difference.keys.push_back({name, ValueBefore(instance, name)});
+    }
+}
+
+void TDifferenceReader::AddContents(TDifference& difference, const ICIMInstance& instance) const
+{
+    for (const std::string& property : fContents) {
+        TCIMValue value = ValueIfDeclared(instance, property, TCIMValue::TCIMType::kNone);
+        if (!value.IsNull()) {
+            difference.contents.emplace_back(property, std::move(value));
+        }
     }
 }
 

@@ -38,6 +38,7 @@ class TDifferenceReader {
     boost::shared_ptr<ICIMInstance> FindByPath(const std::string& path);
     TInstanceIndex& Index(std::size_t inventory);
     void AddKeys(TDifference& difference, const ICIMInstance& instance);
+    void AddContents(TDifference& difference, const ICIMInstance& instance) const;
     void AddChange(TDifference& difference, const std::string& property, const ICIMInstance& reference);
     void AddDisagreements(TDifference& difference);
     TValueGroups MakeGroups(TValueDifference& difference) const;
@@ -50,6 +51,7 @@ class TDifferenceReader {
     bool fHasKeys = true;                                   // of the class being read
     bool fExcludesKeys = false;                             // likewise
     std::vector<std::string> fProperties;                   // likewise; those compared, ascending
+    std::vector<std::string> fContents;                     // the same without keys, in the order of the class
     boost::shared_ptr<ICIMClass> fKeysOf;                   // the class of the instance read last
     std::vector<std::string> fKeys;                         // its keys that are not excluded
     std::vector<std::unique_ptr<TInstanceIndex>> fIndexes;  // of the class being read, made when first needed

@@ -6,7 +6,6 @@
 #include "client/inventory/MakeMissingOperatingSystems.h"
 #include "client/inventory/SchemaDifferences.h"
 #include "client/inventory/TSchemaCompletion.h"
-#include "provider/DeltaNames.h"
 
 namespace NORVZEL20 {
 
@@ -23,13 +22,9 @@ void SortNotes(std::vector<TSchemaNote>& notes)
 
 }  // namespace
 
-std::vector<TSchemaNote> CompleteInventories(std::vector<TInventory>& inventories, IConsole& console)
+std::vector<TSchemaNote> CompleteInventories(std::vector<TInventory>& inventories)
 {
     std::vector<TSchemaNote> notes = MakeMissingOperatingSystems(inventories);
-    for (const TSchemaNote& note : notes) {
-        console.Say("cimdelta: " + inventories[note.inventory].path + ": has no instance of " + kOperatingSystemClass +
-                    ", which a comparison needs; one was made");
-    }
     std::vector<TSchemaNote> schema = TSchemaCompletion(inventories).Run();
     const std::vector<TSchemaNote> differences = FindSchemaDifferences(inventories, schema);
     schema.insert(schema.end(), differences.begin(), differences.end());

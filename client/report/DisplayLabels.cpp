@@ -1,6 +1,7 @@
 #include "client/report/DisplayLabels.h"
 
 #include <boost/algorithm/string/join.hpp>
+#include <numeric>
 
 #include "client/text/DisplayText.h"
 
@@ -13,6 +14,13 @@ std::string DisplayLabels(const TComparisonReport& report, const std::vector<std
         labels.push_back(DisplayLabel(report.labels[inventory]));
     }
     return boost::algorithm::join(labels, ", ");
+}
+
+std::string DisplayOthers(const TComparisonReport& report)
+{
+    std::vector<std::size_t> others(report.labels.size() - 1);
+    std::iota(others.begin(), others.end(), static_cast<std::size_t>(1));
+    return DisplayLabels(report, others);
 }
 
 }  // namespace NORVZEL20

@@ -12,7 +12,8 @@
 // "sharing" is there only if several instances of an inventory have the key: beside "inventories" it says how many, beside a value
 // how many of them have the value. A value that is an embedded object has "embedded" with its contents (see ContentsOf), and if all
 // values are instances of one class, "parts" behind "others" has the properties in which they differ, each as "property",
-// "reference", "others" and perhaps "parts". "path" is there only if the rules of the class exclude keys, "disagreements" only if there are any.
+// "reference", "others" and perhaps "parts". "path" is there only if the rules of the class exclude keys, "disagreements" only if
+// there are any.
 #include "client/report/JsonDifference.h"
 
 #include <utility>

@@ -15,29 +15,20 @@
 #include "client/report/TTextFormat.h"
 
 #include <boost/algorithm/string/join.hpp>
-#include <numeric>
 
+#include "client/report/DescribeAgreement.h"
 #include "client/report/DisplayLabels.h"
 #include "client/report/TDifferenceText.h"
+#include "client/report/TextColors.h"
 #include "client/report/TextCoverage.h"
 #include "client/text/Counted.h"
 #include "client/text/DisplayText.h"
 
 namespace NORVZEL20 {
 
-namespace {
-
-const char kBold[] = "\x1b[1m";
-const char kRed[] = "\x1b[31m";
-const char kGreen[] = "\x1b[32m";
-const char kYellow[] = "\x1b[33m";
-const char kPlain[] = "\x1b[0m";
-
-}  // namespace
-
 void TTextFormat::Write(const TTextSink& sink) const
 {
-    sink(Paint(kBold, Summary()) + "\n");
+    sink(Paint(fColored, kBold, Summary()) + "\n");
     WriteDifferences(sink);
     sink("\n" + WriteTextCoverage(fReport));
 }
@@ -46,22 +37,10 @@ std::string TTextFormat::Summary() const
 {
     const TDifferenceCounts& counts = fReport.differences->GetCounts();
     if (counts.GetTotal() == 0) {
-        return Agreement();
+        return DescribeAgreement(fReport);
     }
-    return Counted(counts.GetTotal(), "difference") + " between " + Labels({0}) + " and " + Others() + ": " + Kinds(counts);
-}
-
-// "No differences" is said only if nothing was left out.
-std::string TTextFormat::Agreement() const
-{
-    const std::string between = " between " + Labels({0}) + " and " + Others();
-    if (fReport.coverage.IsNothingCompared()) {
-        return "Nothing was compared" + between + ".";
-    }
-    if (fReport.coverage.IsCompleteButForTimes()) {
-        return "No differences" + between + (fReport.coverage.IsComplete() ? "." : ", times of collection aside.");
-    }
-    return "No differences in what was compared" + between + "; not everything was, see below.";
+    return Counted(counts.GetTotal(), "difference") + " between " + Labels({0}) + " and " + DisplayOthers(fReport) + ": " +
+           Kinds(counts);
 }
 
 std::string TTextFormat::Kinds(const TDifferenceCounts& counts) const
@@ -75,7 +54,7 @@ std::string TTextFormat::Kinds(const TDifferenceCounts& counts) const
         // Instances that share a key are one difference.
         const bool sharesKeys = counts.instancesOnlyInOthers > counts.onlyInOthers;
         kinds.push_back(Counted(counts.onlyInOthers, sharesKeys ? "key" : "instance") + " only " +
-                        (IsPair() ? "in " + Others() : "elsewhere"));
+                        (IsPair() ? "in " + DisplayOthers(fReport) : "elsewhere"));
     }
     if (counts.changedValues > 0) {
         kinds.push_back(Counted(counts.changedValues, "changed value") + " in " + Counted(counts.changedInstances, "instance"));
@@ -92,7 +71,7 @@ void TTextFormat::WriteDifferences(const TTextSink& sink) const
         if (className != difference.className) {
             className = difference.className;
             changed.clear();
-            sink("\n" + Paint(kBold, EscapeForDisplay(className)) + "\n");
+            sink("\n" + Paint(fColored, kBold, EscapeForDisplay(className)) + "\n");
         }
         const bool isChanged = difference.kind == TDifference::kChanged;
         sink(Describe(difference, isChanged && changed == difference.instance));
@@ -109,29 +88,17 @@ std::string TTextFormat::Describe(const TDifference& difference, bool sameInstan
     }
     switch (difference.kind) {
     case TDifference::kOnlyInReference:
-        return Paint(kRed, "- " + text.Instance()) + "\n" + text.Values();
+        return Paint(fColored, kRed, "- " + text.Instance()) + "\n" + text.Values();
     case TDifference::kOnlyInOthers:
-        return Paint(kGreen, "+ " + text.Instance()) + "\n" + text.Values();
+        return Paint(fColored, kGreen, "+ " + text.Instance()) + "\n" + text.Values();
     default:
-        return Paint(kYellow, "~ " + text.Instance()) + "\n" + text.Values();
+        return Paint(fColored, kYellow, "~ " + text.Instance()) + "\n" + text.Values();
     }
 }
 
 std::string TTextFormat::Labels(const std::vector<std::size_t>& inventories) const
 {
     return DisplayLabels(fReport, inventories);
-}
-
-std::string TTextFormat::Others() const
-{
-    std::vector<std::size_t> others(fReport.labels.size() - 1);
-    std::iota(others.begin(), others.end(), static_cast<std::size_t>(1));
-    return Labels(others);
-}
-
-std::string TTextFormat::Paint(const char* color, const std::string& text) const
-{
-    return fColored ? color + text + kPlain : text;
 }
 
 }  // namespace NORVZEL20

@@ -8,7 +8,8 @@
 
 namespace NORVZEL20 {
 
-/// A comparison for people: a summary in one line, the differences by class and instance, and what was compared and what not.
+/// A comparison for people, difference by difference: a summary in one line, the differences by class and instance, and what was
+/// compared and what not.
 class TTextFormat {
   public:
     /// `report` must outlive this. `colored` adds escape sequences for a terminal.
@@ -20,13 +21,10 @@ class TTextFormat {
 
   private:
     std::string Summary() const;
-    std::string Agreement() const;
     std::string Kinds(const TDifferenceCounts& counts) const;
     void WriteDifferences(const TTextSink& sink) const;
     std::string Describe(const TDifference& difference, bool sameInstance) const;
     std::string Labels(const std::vector<std::size_t>& inventories) const;
-    std::string Others() const;
-    std::string Paint(const char* color, const std::string& text) const;
     bool IsPair() const { return fReport.labels.size() == 2; }
 
     const TComparisonReport& fReport;

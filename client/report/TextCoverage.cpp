@@ -22,6 +22,7 @@
 #include <map>
 #include <utility>
 
+#include "client/report/DescribeNameHint.h"
 #include "client/report/DisplayLabels.h"
 #include "client/rules/DescribeReducedReferences.h"
 #include "client/text/Counted.h"
@@ -248,10 +249,7 @@ class TStatement {
         if (!fCoverage.hint) {
             return;
         }
-        const TNameHint& hint = *fCoverage.hint;
-        fOut += "Hint: 0 of " + Counted(hint.instances.front(), "instance") + " of " + EscapeForDisplay(hint.className) +
-                " match; " + EscapeForDisplay(hint.property) + " has one value in each inventory: try --self " +
-                EscapeForDisplay(hint.property) + ".\n";
+        fOut += DescribeNameHint(*fCoverage.hint) + "\n";
     }
 
     // There may be hundreds of declarations, so they are listed in one line for each pair of inventories.

@@ -1,16 +1,31 @@
 #include "client/report/WriteReport.h"
 
+#include "client/findings/CollectFindings.h"
 #include "client/report/CimXmlFormat.h"
 #include "client/report/JsonFormat.h"
+#include "client/report/TGroupedText.h"
 #include "client/report/TTextFormat.h"
 
 namespace NORVZEL20 {
 
-void WriteReport(const TComparisonReport& report, EOutputFormat format, bool isColored, const TTextSink& sink)
+namespace {
+
+void WriteText(const TComparisonReport& report, const TTextOptions& options, const TTextSink& sink)
+{
+    if (options.isDetailed) {
+        return TTextFormat(report, options.isColored).Write(sink);
+    }
+    const TFindings findings = CollectFindings(report);
+    sink(TGroupedText(report, findings, options).Write());
+}
+
+}  // namespace
+
+void WriteReport(const TComparisonReport& report, EOutputFormat format, const TTextOptions& options, const TTextSink& sink)
 {
     switch (format) {
     case EOutputFormat::kText:
-        return TTextFormat(report, isColored).Write(sink);
+        return WriteText(report, options, sink);
     case EOutputFormat::kJson:
         return WriteJsonReport(report, sink);
     case EOutputFormat::kNdjson:

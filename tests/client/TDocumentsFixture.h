@@ -28,6 +28,7 @@ class TDocumentsFixture : public TClientFixture {
             prefix = path.substr(path.rfind('/') + 1, path.size() - path.rfind('/') - 1 - name.size() - 4);
             arguments.push_back(path);
         }
+        arguments.push_back("--detail");
         arguments.insert(arguments.end(), fOptions.begin(), fOptions.end());
         arguments.insert(arguments.end(), options.begin(), options.end());
         Run(arguments);

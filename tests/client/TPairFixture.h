@@ -16,7 +16,7 @@ class TPairFixture : public TClientFixture {
     {
         const std::string first = Scratch("a.xml", a);
         const std::string second = Scratch("b.xml", b);
-        std::vector<std::string> arguments{"compare", first, second};
+        std::vector<std::string> arguments{"compare", "--detail", first, second};
         arguments.insert(arguments.end(), options.begin(), options.end());
         Run(arguments);
         return Named(fStatus == 2 ? fErr : fOut, first, second);

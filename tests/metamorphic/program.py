@@ -62,7 +62,7 @@ class Program:
     def compare(self, inventories, rules=None, output_format="json", options=()):
         """The result of a comparison, even if nothing was compared."""
         documents = list(inventories) + ([("rules.xml", rules)] if rules is not None else [])
-        arguments = ["compare", "--allow-empty", "-o", output_format, *options, *(["--spec", "rules.xml"] if rules is not None else [])]
+        arguments = ["compare", "--allow-empty", "--detail", "-o", output_format, *options, *(["--spec", "rules.xml"] if rules is not None else [])]
         result = self.run([*arguments, *(name for name, _ in inventories)], documents)
         if result.status not in (0, 1):
             raise Refusal(f"compare ended with status {result.status}: {result.messages.strip()[-600:]}")

@@ -16,9 +16,6 @@ class CompareTest : public TClientFixture {
     }
 };
 
-const char kMadeForOther[] =
-    "cimdelta: other-schema.xml: has no instance of KALMO_OperatingSystem, which a comparison needs; one was made\n";
-
 TEST_F(CompareTest, APairIsReportedWithOldAndNewValues)
 {
     EXPECT_EQ("8 differences between web01 and web02: 2 instances only in web01, 2 instances only in web02, 4 changed values in 3 "
@@ -44,7 +41,7 @@ TEST_F(CompareTest, APairIsReportedWithOldAndNewValues)
               "Compared: 4 classes; 6 instances of web01, 6 instances of web02.\n"
               "1 class has no instances in any inventory.\n"
               "Property of KALMO_OperatingSystem not compared, because it is the time of collection: DateTimeOfCollection.\n",
-              Result({"compare", "web01.xml", "web02.xml"}));
+              Result({"compare", "--detail", "web01.xml", "web02.xml"}));
     EXPECT_EQ(1, fStatus);
 }
 
@@ -75,7 +72,7 @@ TEST_F(CompareTest, OfSeveralInventoriesEqualValuesStandTogether)
               "Compared: 4 classes; 6 instances of web01, 6 instances of web02, 7 instances of web03.\n"
               "1 class has no instances in any inventory.\n"
               "Property of KALMO_OperatingSystem not compared, because it is the time of collection: DateTimeOfCollection.\n",
-              Result({"compare", "web01.xml", "web02.xml", "web03.xml"}));
+              Result({"compare", "--detail", "web01.xml", "web02.xml", "web03.xml"}));
     EXPECT_EQ(1, fStatus);
 }
 
@@ -86,32 +83,34 @@ TEST_F(CompareTest, WhatIsEqualInAnotherOrderIsNoDifference)
               "Compared: 4 classes; 6 instances of web01, 6 instances of web01-again.\n"
               "1 class has no instances in any inventory.\n"
               "Property of KALMO_OperatingSystem not compared, because it is the time of collection: DateTimeOfCollection.\n",
-              Result({"compare", "web01.xml", "web01-again.xml"}));
+              Result({"compare", "--detail", "web01.xml", "web01-again.xml"}));
     EXPECT_EQ(0, fStatus);
 }
 
 TEST_F(CompareTest, OrderInTheFilesDoesNotShowInTheReport)
 {
-    const std::string report = Result({"compare", "web01.xml", "web02.xml", "web03.xml"});
-    const std::string same = Shorten(Result({"compare", "web01-again.xml", "web02.xml", "web03.xml"}), "web01-again", "web01");
+    const std::string report = Result({"compare", "--detail", "web01.xml", "web02.xml", "web03.xml"});
+    const std::string same =
+        Shorten(Result({"compare", "--detail", "web01-again.xml", "web02.xml", "web03.xml"}), "web01-again", "web01");
     EXPECT_EQ(report, same);
 }
 
 TEST_F(CompareTest, EveryRunGivesTheSameBytes)
 {
-    const std::string first = Result({"compare", "-o", "json", "web01.xml", "web02.xml.gz", "web03.xml", "web02.xml.xz"});
+    const std::string first =
+        Result({"compare", "--detail", "-o", "json", "web01.xml", "web02.xml.gz", "web03.xml", "web02.xml.xz"});
     for (int i = 0; i < 10; ++i) {
-        ASSERT_EQ(first, Result({"compare", "-o", "json", "web01.xml", "web02.xml.gz", "web03.xml", "web02.xml.xz"}));
+        ASSERT_EQ(first, Result({"compare", "--detail", "-o", "json", "web01.xml", "web02.xml.gz", "web03.xml", "web02.xml.xz"}));
     }
 }
 
 TEST_F(CompareTest, CompressedInventoriesAreReadWhateverTheirNames)
 {
-    const std::string plain = Result({"compare", "web01.xml", "web02.xml"});
+    const std::string plain = Result({"compare", "--detail", "web01.xml", "web02.xml"});
     for (const char* suffix : {".gz", ".xz", ".zst"}) {
-        EXPECT_EQ(plain, Result({"compare", "web01.xml", std::string("web02.xml") + suffix}));
+        EXPECT_EQ(plain, Result({"compare", "--detail", "web01.xml", std::string("web02.xml") + suffix}));
         const std::string renamed = Scratch("web02.xml", ReadFile(std::string("web02.xml") + suffix));
-        Run({"compare", "-o", "ndjson", "web01.xml", renamed});
+        Run({"compare", "--detail", "-o", "ndjson", "web01.xml", renamed});
         EXPECT_EQ(1, fStatus) << suffix << fErr;
     }
 }
@@ -136,13 +135,13 @@ TEST_F(CompareTest, RulesSayWhatCountsAndTheReportSaysSo)
               "KALMO_OperatingSystem (1 / 1).\n"
               "Properties of INV_Disk not compared, because the rules leave them out: BootId.\n"
               "Properties of INV_Package not compared, because the rules leave them out: Size.\n",
-              Result({"compare", "--spec", "rules.xml", "web01.xml", "web02.xml"}));
+              Result({"compare", "--detail", "--spec", "rules.xml", "web01.xml", "web02.xml"}));
 }
 
 TEST_F(CompareTest, NoDifferencesIsNotSaidOverWhatRulesLeaveOut)
 {
     EXPECT_EQ("No differences in what was compared between web01 and web01-again; not everything was, see below.\n",
-              Result({"compare", "--spec", "rules.xml", "web01.xml", "web01-again.xml"}).substr(0, 98));
+              Result({"compare", "--detail", "--spec", "rules.xml", "web01.xml", "web01-again.xml"}).substr(0, 98));
     EXPECT_EQ(0, fStatus);
 }
 
@@ -170,8 +169,8 @@ TEST_F(CompareTest, InstancesThatShareAKeyAreReported)
         "Properties of INV_Package not compared, because the rules leave them out: Size.\n"
         "Instances of INV_Disk with the key of an earlier one, since the rules leave out BootId: 1 of two-boots, compared with the "
         "same instance of web02 as the earlier one.\n",
-        Result({"compare", "--spec", "rules.xml", "web02.xml", "two-boots.xml"}));
-    const std::string turned = Result({"compare", "--spec", "rules.xml", "two-boots.xml", "web02.xml"});
+        Result({"compare", "--detail", "--spec", "rules.xml", "web02.xml", "two-boots.xml"}));
+    const std::string turned = Result({"compare", "--detail", "--spec", "rules.xml", "two-boots.xml", "web02.xml"});
     EXPECT_NE(std::string::npos, turned.find("leave out BootId: 1 of two-boots, not compared.\n")) << turned;
     EXPECT_NE(std::string::npos, turned.find("Compared: 2 classes; 2 instances of two-boots, 4 instances of web02.\n")) << turned;
 }
@@ -183,7 +182,7 @@ TEST_F(CompareTest, NoDifferencesIsNotSaidOverInstancesThatShareAKey)
     const std::string both = WithoutLast(ReadFile("two-boots.xml"));
     const std::string two = Scratch("two.xml", both);
     const std::string one = Scratch("one.xml", WithoutLast(both));
-    Run({"compare", "--spec", rules, two, one});
+    Run({"compare", "--detail", "--spec", rules, two, one});
     EXPECT_EQ("No differences in what was compared", fOut.substr(0, 35));
     EXPECT_EQ(0, fStatus);
 }
@@ -191,22 +190,21 @@ TEST_F(CompareTest, NoDifferencesIsNotSaidOverInstancesThatShareAKey)
 TEST_F(CompareTest, AnOperatingSystemIsMadeIfTheClassHasNoInstance)
 {
     const std::string none = Scratch("none.xml", WithoutLast(ReadFile("empty-classes.xml")));
-    Run({"compare", "--allow-empty", none, "empty-classes.xml"});
-    EXPECT_EQ("cimdelta: N: has no instance of KALMO_OperatingSystem, which a comparison needs; one was made\n",
-              Shorten(fErr, none, "N"));
+    Run({"compare", "--detail", "--allow-empty", none, "empty-classes.xml"});
+    EXPECT_EQ("", fErr);
     EXPECT_EQ("Nothing was compared between ", fOut.substr(0, 29));
     EXPECT_EQ(0, fStatus);
 }
 
 TEST_F(CompareTest, AnInstanceGoneUnderExcludedKeysIsFoundByItsPath)
 {
-    EXPECT_NE(std::string::npos, Result({"compare", "--spec", "rules.xml", "two-boots.xml", "web02.xml"})
+    EXPECT_NE(std::string::npos, Result({"compare", "--detail", "--spec", "rules.xml", "two-boots.xml", "web02.xml"})
                                      .find("INV_Disk\n- Device=\"sdb\"  (path: root/cimv2:INV_Disk.BootId=1,Device=\"sdb\")\n\n"));
 }
 
 TEST_F(CompareTest, WhatAnotherInventoryDeclaresIsDeclaredAndReported)
 {
-    Run({"compare", "web01.xml", "other-schema.xml"});
+    Run({"compare", "--detail", "web01.xml", "other-schema.xml"});
     EXPECT_EQ("6 differences between web01 and other-schema: 2 instances only in web01, 2 instances only in other-schema, 2 "
               "changed values in 1 "
               "instance\n"
@@ -238,14 +236,14 @@ TEST_F(CompareTest, WhatAnotherInventoryDeclaresIsDeclaredAndReported)
               "Spelled in other-schema as in web01: INV_Package (was inv_package).\n"
               "Spelled in other-schema as in web01: INV_Package.Version (was version).\n",
               fOut);
-    EXPECT_EQ(kMadeForOther, fErr);
+    EXPECT_EQ("", fErr);
     EXPECT_EQ(1, fStatus);
 }
 
 TEST_F(CompareTest, InventoriesWithoutOperatingSystemAreCompleteAllTheSame)
 {
     const std::string again = Scratch("again.xml", ReadFile("other-schema.xml"));
-    Run({"compare", "other-schema.xml", again});
+    Run({"compare", "--detail", "other-schema.xml", again});
     EXPECT_EQ("No differences between other-schema and A.\n"
               "\n"
               "Compared: 3 classes; 5 instances of other-schema, 5 instances of A.\n"
@@ -254,7 +252,7 @@ TEST_F(CompareTest, InventoriesWithoutOperatingSystemAreCompleteAllTheSame)
               "Made in other-schema: an instance of KALMO_OperatingSystem.\n"
               "Made in A: an instance of KALMO_OperatingSystem.\n",
               Shorten(fOut, again.substr(again.rfind('/') + 1, again.size() - again.rfind('/') - 5), "A"));
-    EXPECT_EQ(std::string(kMadeForOther) + Shorten(kMadeForOther, "other-schema.xml", again), fErr);
+    EXPECT_EQ("", fErr);
     EXPECT_EQ(0, fStatus);
 }
 
@@ -286,12 +284,13 @@ TEST_F(CompareTest, TypesAndKeysThatDifferAreReportedAndCompared)
               "keys that "
               "one of them lacks.\n"
               "Of another type in other-types than in web01, so equal only if both are NULL: INV_Package.Size.\n",
-              Result({"compare", "web01.xml", "other-types.xml"}));
+              Result({"compare", "--detail", "web01.xml", "other-types.xml"}));
 }
 
 TEST_F(CompareTest, IfTypesDifferRecordsStillNameTheOneOtherInventory)
 {
-    const std::string records = Scratch("records.xml", Result({"compare", "-o", "cimxml", "web01.xml", "other-types.xml"}));
+    const std::string records =
+        Scratch("records.xml", Result({"compare", "--detail", "-o", "cimxml", "web01.xml", "other-types.xml"}));
     EXPECT_EQ(
         "{\"class\":\"KALMO_Delta\",\"instance\":\"KALMO_Delta.DeltaID=1\",\"properties\":{\"NamespaceIndices\":[1]}}\n"
         "{\"class\":\"KALMO_Delta\",\"instance\":\"KALMO_Delta.DeltaID=4\",\"properties\":{\"NamespaceIndices\":[1]}}\n",
@@ -302,31 +301,32 @@ TEST_F(CompareTest, AStrictSchemaIsTakenAsItIs)
 {
     EXPECT_EQ("cimdelta: the comparison failed: other-schema.xml declares no "
               "class KALMO_OperatingSystem; without --strict-schema, cimdelta declares and makes what is missing\n",
-              Complaint({"compare", "--strict-schema", "web01.xml", "other-schema.xml"}));
+              Complaint({"compare", "--detail", "--strict-schema", "web01.xml", "other-schema.xml"}));
     EXPECT_EQ("cimdelta: the comparison failed: property Size of class INV_Package is uint64 in web01.xml and uint32 in "
               "other-types.xml; without --strict-schema, the values are reported as different\n",
-              Complaint({"compare", "--strict-schema", "web01.xml", "other-types.xml"}));
+              Complaint({"compare", "--detail", "--strict-schema", "web01.xml", "other-types.xml"}));
     EXPECT_EQ("cimdelta: the comparison failed: other-types.xml does not declare class INV_Service, of which web01.xml has "
               "instances; without --strict-schema, cimdelta "
               "declares "
               "and makes what is missing\n",
-              Complaint({"compare", "--strict-schema", "web01.xml", "web02.xml", "other-types.xml"}));
+              Complaint({"compare", "--detail", "--strict-schema", "web01.xml", "web02.xml", "other-types.xml"}));
 }
 
 TEST_F(CompareTest, AStrictSchemaThatFitsGivesTheSameReport)
 {
-    EXPECT_EQ(Result({"compare", "web01.xml", "web02.xml"}), Result({"compare", "--strict-schema", "web01.xml", "web02.xml"}));
+    EXPECT_EQ(Result({"compare", "--detail", "web01.xml", "web02.xml"}),
+              Result({"compare", "--detail", "--strict-schema", "web01.xml", "web02.xml"}));
 }
 
 TEST_F(CompareTest, ColourMarksTheKindOfADifference)
 {
     fColored = true;
-    const std::string report = Result({"compare", "web01.xml", "web02.xml"});
+    const std::string report = Result({"compare", "--detail", "web01.xml", "web02.xml"});
     EXPECT_NE(std::string::npos, report.find("\x1b[31m- Name=\"telnet\"\x1b[0m\n"));
     EXPECT_NE(std::string::npos, report.find("\x1b[32m+ Name=\"curl\"\x1b[0m\n"));
     EXPECT_NE(std::string::npos, report.find("\x1b[33m~ Name=\"bash\"\x1b[0m\n"));
     fColored = false;
-    EXPECT_EQ(std::string::npos, Result({"compare", "web01.xml", "web02.xml"}).find('\x1b'));
+    EXPECT_EQ(std::string::npos, Result({"compare", "--detail", "web01.xml", "web02.xml"}).find('\x1b'));
 }
 
 }  // namespace

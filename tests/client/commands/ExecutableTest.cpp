@@ -20,7 +20,7 @@ TEST_F(ExecutableTest, ResultsGoToStandardOutputAlone)
 
 TEST_F(ExecutableTest, TroubleGoesToStandardErrorAlone)
 {
-    EXPECT_EQ("[2]\n--\ncimdelta: none.xml: cannot be opened: No such file or directory\n", Shell("compare web01.xml none.xml"));
+    EXPECT_EQ("[2]\n--\ncimdelta: none.xml: cannot be opened: No such file or directory\n", Shell("compare --detail web01.xml none.xml"));
     EXPECT_EQ("[2]\n--\ncimdelta: frob is no command; name one: compare, check, explain, query or show; see cimdelta --help\n",
               Shell("frob"));
 }
@@ -39,25 +39,25 @@ TEST_F(ExecutableTest, MessagesMoveNoTerminal)
 
 TEST_F(ExecutableTest, TheStatusSaysWhetherSomethingDiffers)
 {
-    EXPECT_EQ("[0]", Shell("compare web01.xml web01-again.xml").substr(0, 3));
-    EXPECT_EQ("[1]", Shell("compare web01.xml web02.xml").substr(0, 3));
+    EXPECT_EQ("[0]", Shell("compare --detail web01.xml web01-again.xml").substr(0, 3));
+    EXPECT_EQ("[1]", Shell("compare --detail web01.xml web02.xml").substr(0, 3));
 }
 
 TEST_F(ExecutableTest, StandardInputIsAnInventoryToo)
 {
     EXPECT_EQ(kPackages, Shell("show - INV_Disk < web01.xml"));
-    EXPECT_EQ("[1]\n8 differences between web01 and stdin: ", Shell("compare web01.xml - < web02.xml.gz").substr(0, 43));
+    EXPECT_EQ("[1]\n8 differences between web01 and stdin: ", Shell("compare --detail web01.xml - < web02.xml.gz").substr(0, 43));
     EXPECT_EQ(
         "[2]\n--\ncimdelta: standard input: cannot be read: the gzip data is damaged (it ends early); fetch or make it anew\n",
-        Shell("compare web01.xml -", "head -c 700 web02.xml.gz | "));
+        Shell("compare --detail web01.xml -", "head -c 700 web02.xml.gz | "));
 }
 
 TEST_F(ExecutableTest, RulesMayComeFromStandardInputOrAPipe)
 {
-    const std::string compared = Shell("compare --spec rules.xml web01.xml web02.xml");
+    const std::string compared = Shell("compare --detail --spec rules.xml web01.xml web02.xml");
     EXPECT_EQ("[1]", compared.substr(0, 3));
-    EXPECT_EQ(compared, Shell("compare --spec - web01.xml web02.xml < rules.xml"));
-    EXPECT_EQ(compared, Shell("compare --spec /dev/fd/0 web01.xml web02.xml", "cat rules.xml | "));
+    EXPECT_EQ(compared, Shell("compare --detail --spec - web01.xml web02.xml < rules.xml"));
+    EXPECT_EQ(compared, Shell("compare --detail --spec /dev/fd/0 web01.xml web02.xml", "cat rules.xml | "));
     EXPECT_EQ("[0]\nINV_Package.Size: not compared, excluded by the list at standard input:5 (element for class INV_Package)\n--\n",
               Shell("explain INV_Package.Size --spec - --schema web01.xml < rules.xml"));
     EXPECT_EQ("[0]\nstandard input: 2 elements, 0 warnings\n",
@@ -68,9 +68,9 @@ TEST_F(ExecutableTest, RulesMayComeFromStandardInputOrAPipe)
 
 TEST_F(ExecutableTest, AnOutputFileAppearsWhole)
 {
-    const std::string report = Shell("compare web01.xml web02.xml");
+    const std::string report = Shell("compare --detail web01.xml web02.xml");
     const std::string file = Scratch("report", "what was there before");
-    EXPECT_EQ("[1]\n--\n", Shell("compare --output " + file + " web01.xml web02.xml"));
+    EXPECT_EQ("[1]\n--\n", Shell("compare --detail --output " + file + " web01.xml web02.xml"));
     EXPECT_EQ(report, "[1]\n" + ReadFile(file) + "--\n");
 }
 
@@ -101,10 +101,10 @@ TEST_F(ExecutableTest, AnOutputFileKeepsOwnerAndRights)
 TEST_F(ExecutableTest, AnOutputFileStaysInTrouble)
 {
     const std::string file = Scratch("report", "what was there before");
-    EXPECT_EQ("[2]", Shell("compare --output " + file + " web01.xml none.xml").substr(0, 3));
+    EXPECT_EQ("[2]", Shell("compare --detail --output " + file + " web01.xml none.xml").substr(0, 3));
     EXPECT_EQ("what was there before", ReadFile(file));
     EXPECT_EQ("[2]\n--\ncimdelta: /nowhere/report: cannot be written: No such file or directory\n",
-              Shell("compare --output /nowhere/report web01.xml web02.xml"));
+              Shell("compare --detail --output /nowhere/report web01.xml web02.xml"));
 }
 
 TEST_F(ExecutableTest, AFullDeviceIsReported)

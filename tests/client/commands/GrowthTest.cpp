@@ -80,7 +80,7 @@ TEST_F(GrowthTest, ComparingInventories)
                          for (std::size_t i = 0; i < 20; ++i) {
                              classes += Class("C" + Number(i), "", KeyProperty("Id") + Declaration("Size", "string"));
                          }
-                         std::vector<std::string> arguments{"compare"};
+                         std::vector<std::string> arguments{"compare", "--detail"};
                          for (std::size_t i = 0; i < n; ++i) {
                              arguments.push_back(Inventory(Number(i) + ".xml", classes));
                          }
@@ -98,9 +98,9 @@ TEST_F(GrowthTest, ComparingInstancesThatShareAKey)
                          for (std::size_t i = 0; i < n; ++i) {
                              disks += Instance("Disk", Value("Id", Number(i)) + Value("Size", Number(i)));
                          }
-                         return Allocations({"compare", "--spec", Rules("<class name='Disk' default='include' excludekeys='Id'/>"),
-                                             Inventory("a.xml", cls + Instance("Disk", Value("Id", "x"))),
-                                             Inventory("b.xml", cls + disks)});
+                         return Allocations(
+                             {"compare", "--detail", "--spec", Rules("<class name='Disk' default='include' excludekeys='Id'/>"),
+                              Inventory("a.xml", cls + Instance("Disk", Value("Id", "x"))), Inventory("b.xml", cls + disks)});
                      }),
               kInProportion);
 }

@@ -35,7 +35,7 @@ class ManyInventoriesTest : public TProgramFixture {
 
 TEST_F(ManyInventoriesTest, AreComparedWithFewDescriptors)
 {
-    const std::string outcome = Shell(Line("compare web01.xml", Inventories("web01-again.xml", 50, "web03.xml")), "ulimit -n 40; ");
+    const std::string outcome = Shell(Line("compare --detail web01.xml", Inventories("web01-again.xml", 50, "web03.xml")), "ulimit -n 40; ");
     EXPECT_EQ("[1]\n5 differences between web01 and ", outcome.substr(0, 36));
     EXPECT_NE(std::string::npos, outcome.find("    Version: 5.1 -> web03: 5.2\n")) << outcome;
 }
@@ -46,7 +46,7 @@ TEST_F(ManyInventoriesTest, TheFirstThatCannotBeLoadedIsReported)
     std::vector<std::string> inventories = Inventories("web01.xml", 50, "other-types.xml");
     inventories[51] = unfinished;
     inventories[52] = Scratch("no-xml", "no XML");
-    EXPECT_EQ(0u, Shell(Line("compare", inventories)).find("[2]\n--\ncimdelta: " + unfinished + ":2:1: "));
+    EXPECT_EQ(0u, Shell(Line("compare --detail", inventories)).find("[2]\n--\ncimdelta: " + unfinished + ":2:1: "));
 }
 
 TEST_F(ManyInventoriesTest, AreLoadedAndRemarkedUponInTheirOrder)

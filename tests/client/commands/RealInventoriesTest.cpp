@@ -73,23 +73,23 @@ class RealInventoriesTest : public TClientFixture {
 
 TEST_F(RealInventoriesTest, TheReportIsTheListThatCameWithTheData)
 {
-    Run({"compare", "-o", "json", "a.xml.xz", "c.xml.xz"});
+    Run({"compare", "--detail", "-o", "json", "a.xml.xz", "c.xml.xz"});
     ASSERT_EQ(1, fStatus) << fErr;
     const std::set<std::string> expected = Expected("oracle-ac.tsv.xz");
     ASSERT_GT(expected.size(), 500u);
     EXPECT_TRUE(expected == Found(fOut));
-    Run({"compare", "-o", "json", "a.xml.xz", "b.xml.xz"});
+    Run({"compare", "--detail", "-o", "json", "a.xml.xz", "b.xml.xz"});
     ASSERT_EQ(1, fStatus) << fErr;
     EXPECT_TRUE(Expected("oracle-ab.tsv.xz") == Found(fOut));
 }
 
 TEST_F(RealInventoriesTest, CountsAgreeOverAllClasses)
 {
-    Run({"compare", "a.xml.xz", "b.xml.xz"});
+    Run({"compare", "--detail", "a.xml.xz", "b.xml.xz"});
     EXPECT_EQ("28703 differences between a and b: 955 instances only in a, 1648 instances only in b, 26100 changed values in 5945 "
               "instances\n",
               fOut.substr(0, fOut.find('\n') + 1));
-    Run({"compare", "a.xml.xz", "c.xml.xz"});
+    Run({"compare", "--detail", "a.xml.xz", "c.xml.xz"});
     EXPECT_EQ("913 differences between a and c: 2 instances only in c, 911 changed values in 267 instances\n",
               fOut.substr(0, fOut.find('\n') + 1));
 }

@@ -106,7 +106,7 @@ TEST_F(RulesCommandsTest, ExplainFollowsAnIncludedNameInAnotherLetterCase)
                         "</class></DifftoolSpec>");
     EXPECT_EQ("INV_Package.Version: compared, included by the list at R:3 (element for class INV_Package)\n",
               Shorten(Result({"explain", "INV_Package.Version", "--spec", rules, "--schema", "web01.xml"}), rules, "R"));
-    Run({"compare", "--spec", rules, "web01.xml", "web02.xml"});
+    Run({"compare", "--detail", "--spec", rules, "web01.xml", "web02.xml"});
     EXPECT_NE(std::string::npos, fOut.find("    version: 5.1 -> 5.2\n")) << fOut;
 }
 
@@ -310,7 +310,7 @@ TEST_F(RulesCommandsTest, TwoSpellingsInListsAreExplainedAsTheyAreCompared)
         const std::string explanation =
             Shorten(Result({"explain", "INV_Package.Version", "--spec", rules, "--schema", "web01.xml"}), rules, "R");
         EXPECT_EQ(row.explanation, explanation);
-        Run({"compare", "--spec", rules, "web01.xml", "web02.xml"});
+        Run({"compare", "--detail", "--spec", rules, "web01.xml", "web02.xml"});
         EXPECT_EQ(explanation.find("not compared") == std::string::npos, fOut.find("ersion: 5.1 -> 5.2") != std::string::npos)
             << fOut;
     }
@@ -318,12 +318,12 @@ TEST_F(RulesCommandsTest, TwoSpellingsInListsAreExplainedAsTheyAreCompared)
 
 TEST_F(RulesCommandsTest, CompareSaysTheWarningsOfCheck)
 {
-    Run({"compare", "--spec", "odd-rules.xml", "web01.xml", "web02.xml"});
+    Run({"compare", "--detail", "--spec", "odd-rules.xml", "web01.xml", "web02.xml"});
     EXPECT_EQ(7, std::count(fErr.begin(), fErr.end(), '\n')) << fErr;
     EXPECT_EQ(0u, fErr.find("cimdelta: odd-rules.xml:3: warning: the element for class INV_Service is read before")) << fErr;
-    Run({"compare", "--spec", "rules.xml", "web01.xml", "web02.xml"});
+    Run({"compare", "--detail", "--spec", "rules.xml", "web01.xml", "web02.xml"});
     EXPECT_EQ("", fErr);
-    Run({"compare", "web01.xml", "web02.xml"});
+    Run({"compare", "--detail", "web01.xml", "web02.xml"});
     EXPECT_EQ("", fErr);
 }
 

@@ -28,7 +28,7 @@ class RulesVerdictTest : public TClientFixture {
     {
         const std::string check = Verdict({"check", rules, "--schema", fInventory});
         EXPECT_EQ(check, Verdict({"explain", "Disk.Size", "--spec", rules, "--schema", fInventory}));
-        EXPECT_EQ(check, Verdict({"compare", "--allow-empty", "--spec", rules, fInventory, fAgain}));
+        EXPECT_EQ(check, Verdict({"compare", "--detail", "--allow-empty", "--spec", rules, fInventory, fAgain}));
         // Without an inventory there are fewer reasons to refuse rules, but no others.
         const std::string alone = Verdict({"check", rules});
         if (alone != "accepted") {

@@ -115,7 +115,7 @@ TEST_F(ExcludedKeysCoverageTest, ReferencesAmongTheOthersCountToo)
     };
     const auto verdict = [&](const std::string& first, const std::string& second) {
         const std::string rules = Scratch("rules", "<DifftoolSpec>" + kSystem + kMountsOfAnyDisk + "</DifftoolSpec>");
-        const std::vector<std::string> command{"compare",       "--spec",           rules,
+        const std::vector<std::string> command{"compare",       "--detail",         "--spec",           rules,
                                                mounts("a", ""), mounts("b", first), mounts("c", second)};
         Run(command);
         const std::string text = fOut;

@@ -25,7 +25,7 @@ class MadeSystemTest : public TPairFixture {
     /// The report on the inventories, named by the last letter of their labels.
     std::string Report(const std::vector<std::string>& inventories, const std::vector<std::string>& options = {})
     {
-        std::vector<std::string> arguments{"compare", "--allow-empty"};
+        std::vector<std::string> arguments{"compare", "--detail", "--allow-empty"};
         arguments.insert(arguments.end(), inventories.begin(), inventories.end());
         arguments.insert(arguments.end(), options.begin(), options.end());
         Run(arguments);

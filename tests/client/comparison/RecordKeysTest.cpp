@@ -9,10 +9,10 @@ class RecordKeysTest : public TClientFixture {
     /// The message or report of a comparison of two results under a rule for their records.
     std::string Compare(const std::string& rule)
     {
-        const std::string first = Scratch("first.xml", Result({"compare", "-o", "cimxml", "web01.xml", "web02.xml"}));
-        const std::string second = Scratch("second.xml", Result({"compare", "-o", "cimxml", "web01.xml", "web03.xml"}));
+        const std::string first = Scratch("first.xml", Result({"compare", "--detail", "-o", "cimxml", "web01.xml", "web02.xml"}));
+        const std::string second = Scratch("second.xml", Result({"compare", "--detail", "-o", "cimxml", "web01.xml", "web03.xml"}));
         const std::string rules = Scratch("rules", "<DifftoolSpec>\n<class name='" + rule + "/>\n</DifftoolSpec>");
-        Run({"compare", "--spec", rules, first, second});
+        Run({"compare", "--detail", "--spec", rules, first, second});
         return fStatus == 2 ? Shorten(fErr.substr(fErr.rfind("cimdelta: ")), rules, "R") : fOut.substr(0, fOut.find(' '));
     }
 
@@ -49,7 +49,7 @@ TEST_F(RecordKeysTest, WithoutInstancesTheyDoNotMatter)
     const std::string file = Scratch("declared.xml", text.insert(text.find("<VALUE.OBJECT>"), class_));
     const std::string rules = Scratch("rules", "<DifftoolSpec><class name='KALMO_Delta' default='include' excludekeys='DeltaID'/>"
                                                "<class name='INV_Package' default='include'/></DifftoolSpec>");
-    Run({"compare", "--spec", rules, file, "web02.xml"});
+    Run({"compare", "--detail", "--spec", rules, file, "web02.xml"});
     EXPECT_EQ(1, fStatus) << fErr;
     EXPECT_NE(std::string::npos, fOut.find("INV_Package\n~ Name=\"bash\"\n")) << fOut;
 }

@@ -69,11 +69,11 @@ TEST_F(ReferenceTypeTest, AThirdInventoryIsComparedAsEver)
     const std::string second = Scratch("b.xml", Writing("sda"));
     const std::string third = Scratch("c.xml", Referring("sdb"));
     for (const std::vector<std::string>& others : {std::vector<std::string>{second, third}, {third, second}}) {
-        const std::string report = Result({"compare", "-o", "ndjson", first, others[0], others[1]});
+        const std::string report = Result({"compare", "--detail", "-o", "ndjson", first, others[0], others[1]});
         EXPECT_NE(std::string::npos, report.find("\"type\":\"string\",\"value\":\"Disk.Id=\\\"sda\\\"\"}")) << report;
         EXPECT_NE(std::string::npos, report.find("\"type\":\"reference\",\"value\":\"Disk.Id=\\\"sdb\\\"\"}")) << report;
     }
-    const std::string report = Named(Result({"compare", first, second, third}), first, second);
+    const std::string report = Named(Result({"compare", "--detail", first, second, third}), first, second);
     EXPECT_NE(std::string::npos, report.find("\n    On: reference Disk.Id=\"sda\" -> b: string \"Disk.Id=\\\"sda\\\"\" / "))
         << report;
     EXPECT_NE(std::string::npos, report.find(": reference Disk.Id=\"sdb\"\n")) << report;

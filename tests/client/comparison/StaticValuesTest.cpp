@@ -114,7 +114,7 @@ TEST_F(StaticValuesTest, SoDoesEveryInstanceOfThree)
     const std::string old = Scratch("a.xml", Disks("old"));
     const std::string other = Scratch("b.xml", Disks("new"));
     const std::string third = Scratch("c.xml", Disks("new"));
-    const std::string report = Named(Result({"compare", old, other, third}), old, other);
+    const std::string report = Named(Result({"compare", "--detail", old, other, third}), old, other);
     EXPECT_EQ(0u, report.find("3 differences between a and b, ")) << report;
     EXPECT_NE(std::string::npos, report.find("    Firmware: old -> b, ")) << report;
 }

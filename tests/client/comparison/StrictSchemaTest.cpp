@@ -133,7 +133,7 @@ TEST_F(StrictSchemaTest, OfThreeInventoriesOnlyAReferenceNeedsItsType)
     const std::string b = Scratch("b.xml", parts(Declaration("On", "string"), Value("On", "x")));
     EXPECT_EQ("cimdelta: the comparison failed: property On of class Part is reference in a.xml and string in b.xml" +
                   std::string(kTypesAdvice),
-              Named(Complaint({"compare", "--strict-schema", a, Scratch("c.xml", ReadFile(a)), b}), a, b));
+              Named(Complaint({"compare", "--detail", "--strict-schema", a, Scratch("c.xml", ReadFile(a)), b}), a, b));
 }
 
 /// No inventory in a file nests references so deep; the key is put there by hand.
@@ -181,7 +181,7 @@ TEST_F(StrictSchemaTest, EachInstanceHasTheKeysOfItsOwnClass)
     const std::string b =
         Scratch("b.xml", Disks(KeyProperty("Id") + KeyProperty("Bus"), Disk(Value("Id", "1") + Value("Bus", "x"))));
     const std::string c = Scratch("c.xml", ReadFile(a));
-    const std::string report = Named(Result({"compare", "--strict-schema", "-o", "ndjson", a, b, c}), a, b);
+    const std::string report = Named(Result({"compare", "--detail", "--strict-schema", "-o", "ndjson", a, b, c}), a, b);
     EXPECT_NE(std::string::npos,
               report.find("\"instance\":\"Disk.Bus=\\\"x\\\",Id=\\\"1\\\"\",\"keys\":{\"Id\":\"1\",\"Bus\":\"x\"}"))
         << report;
@@ -200,14 +200,14 @@ TEST_F(StrictSchemaTest, NamesThatDifferInLetterCaseAreReported)
     const std::string a = Scratch("a.xml", Disks(KeyProperty("Id"), Disk(Value("Id", "1"))));
     const std::string b = Scratch("b.xml", Disks(KeyProperty("ID"), Disk(Value("ID", "1"), "disk"), "disk"));
     const std::string c = Scratch("c.xml", ReadFile(a));
-    const std::string report = Named(Result({"compare", "--strict-schema", a, b, c}), a, b);
+    const std::string report = Named(Result({"compare", "--detail", "--strict-schema", a, b, c}), a, b);
     EXPECT_NE(
         std::string::npos,
         report.find(
             "\nDisk is spelled disk in b, so instances do not match.\nDisk.Id is spelled ID in b, so instances do not match.\n"))
         << report;
     EXPECT_NE(std::string::npos,
-              Result({"compare", "--strict-schema", "-o", "ndjson", a, b, c}).find("\"kind\":\"spellingDiffers\""));
+              Result({"compare", "--detail", "--strict-schema", "-o", "ndjson", a, b, c}).find("\"kind\":\"spellingDiffers\""));
 }
 
 /// A run over two inventories adds what the other one has to the reference, which takes names in any letter case for the same.

@@ -53,7 +53,7 @@ TEST_F(TallTreeTest, InventoriesWhoseTreesJoinBeyondTheLimitAreRefused)
 {
     const std::string lower = Scratch("lower.xml", Chain(0, 600));
     const std::string upper = Scratch("upper.xml", Chain(600, 1200));
-    const std::string complaint = Complaint({"compare", lower, upper});
+    const std::string complaint = Complaint({"compare", "--detail", lower, upper});
     EXPECT_EQ("cimdelta: lower.xml: class C1001 of upper.xml cannot be declared here: it would have more than 1000 superclasses; "
               "flatten the class tree\n",
               Shorten(Shorten(complaint.substr(complaint.rfind("cimdelta: ")), lower, "lower.xml"), upper, "upper.xml"));
@@ -63,7 +63,7 @@ TEST_F(TallTreeTest, InventoriesWhosePropertiesJoinBeyondTheLimitAreRefused)
 {
     const std::string first = Scratch("first.xml", Wide(0, 600));
     const std::string second = Scratch("second.xml", Wide(600, 600));
-    const std::string complaint = Complaint({"compare", first, second});
+    const std::string complaint = Complaint({"compare", "--detail", first, second});
     EXPECT_EQ("cimdelta: second.xml: class A of first.xml cannot be declared here: class A would have more than 1024 properties; "
               "split it\n",
               Shorten(Shorten(complaint.substr(complaint.rfind("cimdelta: ")), first, "first.xml"), second, "second.xml"));
@@ -71,7 +71,7 @@ TEST_F(TallTreeTest, InventoriesWhosePropertiesJoinBeyondTheLimitAreRefused)
 
 TEST_F(TallTreeTest, TreesThatJoinWithinTheLimitAreCompared)
 {
-    Run({"compare", "--allow-empty", Scratch("a.xml", Chain(0, 600)), Scratch("b.xml", Chain(600, 1000))});
+    Run({"compare", "--detail", "--allow-empty", Scratch("a.xml", Chain(0, 600)), Scratch("b.xml", Chain(600, 1000))});
     EXPECT_EQ(0, fStatus) << fErr;
 }
 

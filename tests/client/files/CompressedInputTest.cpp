@@ -99,13 +99,13 @@ TEST_F(CompressedInputTest, AValueThatIsNotTheOneThatWasCompressedIsNoAgreement)
     const std::string text = ReadFile("web01.xml");
     std::string other = text;
     other.replace(other.find("500"), 3, "501");
-    ASSERT_EQ(0u, Result({"compare", "web01.xml", Scratch("good", StoredGzip(text, text))}).find("No differences"));
+    ASSERT_EQ(0u, Result({"compare", "--detail", "web01.xml", Scratch("good", StoredGzip(text, text))}).find("No differences"));
     const std::string hidden = Scratch("hidden", StoredGzip(text, other));
     EXPECT_EQ("cimdelta: H: cannot be read: the gzip data is damaged (incorrect data check); fetch or make it anew\n",
-              Shorten(Complaint({"compare", "web01.xml", hidden}), hidden, "H"));
+              Shorten(Complaint({"compare", "--detail", "web01.xml", hidden}), hidden, "H"));
     const std::string longer = Scratch("longer", StoredGzip(text, text).replace(text.size() + 19, 1, "\1"));
     EXPECT_EQ("cimdelta: H: cannot be read: the gzip data is damaged (incorrect length check); fetch or make it anew\n",
-              Shorten(Complaint({"compare", "web01.xml", longer}), longer, "H"));
+              Shorten(Complaint({"compare", "--detail", "web01.xml", longer}), longer, "H"));
 }
 
 TEST_F(CompressedInputTest, SeveralMembersAreOneText)

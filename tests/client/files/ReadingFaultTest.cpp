@@ -129,7 +129,7 @@ TEST_F(ReadingFaultTest, FewFilesAreOpenAtATime)
         std::this_thread::sleep_for(std::chrono::milliseconds(20));
     });
     calls.Watch("close", [&](int) { --open; });
-    std::vector<std::string> arguments(1, "compare");
+    std::vector<std::string> arguments{"compare", "--detail"};
     for (int i = 0; i < 60; ++i) {
         arguments.push_back(Scratch(std::to_string(i) + ".xml", ReadFile("web02.xml")));
     }

@@ -98,7 +98,7 @@ TEST_F(TemporaryFileTest, IsInTheFolderIfItCannotBeAnonymous)
 
 TEST_F(TemporaryFileTest, TheRulesThatCompareMakesAreReadInEitherWay)
 {
-    const std::vector<std::string> compare{"compare", "web01.xml", "web02.xml"};
+    const std::vector<std::string> compare{"compare", "--detail", "web01.xml", "web02.xml"};
     const std::string anonymous = Result(compare);
     TSystemCalls calls;
     calls.Fail("memfd_create", 1, ENOSYS);
@@ -110,12 +110,12 @@ TEST_F(TemporaryFileTest, TheRulesThatCompareMakesAreReadInEitherWay)
 TEST_F(TemporaryFileTest, TheFolderNeedNotExistIfTheFileIsAnonymous)
 {
     setenv("TMPDIR", "/nowhere", 1);
-    EXPECT_EQ(0u, Result({"compare", "web01.xml", "web02.xml"}).find("8 differences between web01 and web02: "));
+    EXPECT_EQ(0u, Result({"compare", "--detail", "web01.xml", "web02.xml"}).find("8 differences between web01 and web02: "));
     TSystemCalls calls;
     calls.Fail("memfd_create", 1, ENOSYS);
     EXPECT_EQ(
         "cimdelta: /nowhere/cimdelta-XXXXXX: no temporary file can be made: No such file or directory; TMPDIR names the folder\n",
-        Complaint({"compare", "web01.xml", "web02.xml"}));
+        Complaint({"compare", "--detail", "web01.xml", "web02.xml"}));
 }
 
 /// Makes a temporary file in the folder and ends the process by the signal. Comes back only if there is no such file.

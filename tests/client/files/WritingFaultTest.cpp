@@ -116,7 +116,7 @@ TEST_F(WritingFaultTest, RulesThatCannotBeKeptAreReported)
         TSystemCalls calls;
         calls.Fail("memfd_create", 1, ENOSYS);
         calls.Fail(call, call == std::string("close") ? 5 : 1, ENOSPC);
-        const std::string message = Complaint({"compare", "web01.xml", "web02.xml"});
+        const std::string message = Complaint({"compare", "--detail", "web01.xml", "web02.xml"});
         EXPECT_EQ("cimdelta: " + fFolder.GetPath() + "/cimdelta-", message.substr(0, fFolder.GetPath().size() + 20)) << call;
         EXPECT_NE(std::string::npos, message.find(": No space left on device; TMPDIR names the folder\n")) << message;
         ExpectAsBefore();

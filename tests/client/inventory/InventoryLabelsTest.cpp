@@ -78,7 +78,7 @@ class LabelsInReportsTest : public TClientFixture {
     {
         std::filesystem::copy_file("web02.xml", fFolder / second, std::filesystem::copy_options::overwrite_existing);
         std::filesystem::copy_file("web03.xml", fFolder / third, std::filesystem::copy_options::overwrite_existing);
-        return Result({"compare", "-o", format, "web01.xml", fFolder / second, fFolder / third});
+        return Result({"compare", "--detail", "-o", format, "web01.xml", fFolder / second, fFolder / third});
     }
 
     const TOutputFolder fFolder;

@@ -89,7 +89,7 @@ TEST_F(NamespaceTest, IdenticalContentsOfTwoNamespacesAreEqual)
     };
     const std::string a = Scratch("a.xml", links("root/hw"));
     const std::string b = Scratch("b.xml", links("root/sw"));
-    const std::string report = Result({"compare", "a=" + a, "b=" + b});
+    const std::string report = Result({"compare", "--detail", "a=" + a, "b=" + b});
     EXPECT_EQ(0u, report.find("No differences between a and b.\n")) << report;
     EXPECT_NE(std::string::npos, report.find("Namespace of a: root/hw, the one that its references name.\n"
                                              "Namespace of b: root/sw, the one that its references name.\n"))
@@ -101,7 +101,7 @@ TEST_F(NamespaceTest, EachInventoryMayGetItsOwn)
     const auto links = [](const std::string& ns) { return Links({PathInto(ns, "sda"), PathInto("root/other", "sdb")}); };
     const std::string a = "a=" + Scratch("a.xml", links("root/hw"));
     const std::string b = "b=" + Scratch("b.xml", links("root/sw"));
-    const std::string report = Result({"compare", a, b, "--namespace", "a=root/hw", "--namespace", "b=root/sw"});
+    const std::string report = Result({"compare", "--detail", a, b, "--namespace", "a=root/hw", "--namespace", "b=root/sw"});
     EXPECT_EQ(0u, report.find("No differences between a and b.\n")) << report;
     EXPECT_NE(std::string::npos, report.find("Namespace of b: root/sw, as --namespace says.\n")) << report;
     const nlohmann::json inventories = nlohmann::json::parse(

@@ -38,7 +38,7 @@ class SchemaNotesTest : public TPairFixture {
         const std::string a = Scratch("a.xml", Document(System() + inA));
         const std::string b = Scratch("b.xml", Document(System() + inB));
         const std::string c = Scratch("c.xml", Document(System() + inC));
-        Run({"compare", a, b, c});  // with a message on each array, because the documents declare no qualifiers
+        Run({"compare", "--detail", a, b, c});  // with a message on each array, because the documents declare no qualifiers
         std::istringstream report(Shorten(Named(fOut, a, b), c.substr(c.rfind('/') + 1, c.size() - c.rfind('/') - 5), "c"));
         std::string differences;
         bool reached = false;

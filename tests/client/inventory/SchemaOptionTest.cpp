@@ -48,7 +48,7 @@ TEST_F(SchemaOptionTest, TheMessageNamesBothOptions)
 TEST_F(SchemaOptionTest, ASchemaServesForAllInventories)
 {
     for (const char* option : {"--schema", "--declarations"}) {
-        Run({"compare", fA, fB, option, fSchema});
+        Run({"compare", "--detail", fA, fB, option, fSchema});
         EXPECT_EQ(0u, fOut.find("1 difference between a and b: 1 changed value in 1 instance\n")) << fOut << fErr;
     }
     EXPECT_EQ("Disk: 2 instances\n", Result({"show", fA, "--schema", fSchema}));
@@ -82,7 +82,7 @@ TEST_F(SchemaOptionTest, TheFilesOfASchemaAreCheckedLikeOthers)
 
 TEST_F(SchemaOptionTest, ClassesAreInferred)
 {
-    Run({"compare", fA, fB, "--infer-classes", "--allow-empty"});
+    Run({"compare", "--detail", fA, fB, "--infer-classes", "--allow-empty"});
     EXPECT_EQ(0u, fOut.find("1 difference between a and b: 1 changed value in 1 instance\n")) << fOut << fErr;
     EXPECT_NE(std::string::npos, fOut.find("Inferred in a from instances, with their keys: Disk (Id).\n"
                                            "Inferred in b from instances, with their keys: Disk (Id).\n"))
@@ -101,7 +101,7 @@ TEST_F(SchemaOptionTest, InferredClassesAreCompletedLikeOthers)
     const std::string plain = Write("c.xml", "<CIM><DECLARATION><DECLGROUP><VALUE.NAMEDOBJECT>" + Path("Disk", "Id", "a") +
                                                  "<INSTANCE CLASSNAME=\"Disk\">" + Value("Id", "a") +
                                                  "</INSTANCE></VALUE.NAMEDOBJECT></DECLGROUP></DECLARATION></CIM>");
-    Run({"compare", fA, plain, "--infer-classes"});
+    Run({"compare", "--detail", fA, plain, "--infer-classes"});
     EXPECT_NE(std::string::npos, fOut.find("Size: 1 -> NULL")) << fOut << fErr;
 }
 

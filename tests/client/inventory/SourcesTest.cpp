@@ -93,7 +93,7 @@ TEST_F(SourcesTest, AnExistingPathIsTakenAsItIs)
 TEST_F(SourcesTest, LabelsAreThoseGivenOrThoseOfTheFirstSource)
 {
     Write("db01/a.xml", System());
-    const std::string report = Result({"compare", "old=web01.xml", (fFolder / "db01/") + "," + Write("x.xml", "")});
+    const std::string report = Result({"compare", "--detail", "old=web01.xml", (fFolder / "db01/") + "," + Write("x.xml", "")});
     EXPECT_NE(std::string::npos, report.find(" between old and db01: ")) << report;
 }
 

@@ -78,7 +78,7 @@ TEST_F(SystemNamesTest, ThePropertyIsNamedOrNot)
 /// The name of a property behind the option is not taken for a file, nor a file for the name of a property.
 TEST_F(SystemNamesTest, AFileBehindTheOptionIsAFile)
 {
-    Run({"compare", "--self", "web01.xml", "web01-again.xml"});
+    Run({"compare", "--detail", "--self", "web01.xml", "web01-again.xml"});
     EXPECT_NE(std::string::npos, fErr.find("no instance has a value of SystemName")) << fErr;
     Run({"compare", "--", "--self", "web01.xml"});
     EXPECT_NE(std::string::npos, fErr.find("--self: ")) << fErr;
@@ -178,7 +178,7 @@ TEST_F(SystemNamesTest, ALabelMayStandForTheName)
     const std::string a = Scratch("a.xml", Document(System() + ArrayOf("array1", 2)));
     const std::string b = Scratch("b.xml", Document(System() + ArrayOf("array2", 2)));
     const auto label = [](const std::string& path) { return path.substr(path.rfind('/') + 1, path.size() - path.rfind('/') - 5); };
-    Run({"compare", a, b, "--same", label(a) + "=" + label(b)});
+    Run({"compare", "--detail", a, b, "--same", label(a) + "=" + label(b)});
     EXPECT_EQ(0, fStatus) << fErr << fOut;
 }
 

@@ -171,8 +171,8 @@ TEST_P(MemoryFaultTest, Query)
 
 TEST_P(MemoryFaultTest, Compare)
 {
-    Exhaust({"compare", "web01.xml", "web02.xml"});
-    Exhaust({"compare", "web01.xml", "other-schema.xml", "-o", "cimxml"});
+    Exhaust({"compare", "--detail", "web01.xml", "web02.xml"});
+    Exhaust({"compare", "--detail", "web01.xml", "other-schema.xml", "-o", "cimxml"});
 }
 
 TEST_P(MemoryFaultTest, CheckAndExplain)
@@ -185,7 +185,7 @@ TEST_P(MemoryFaultTest, CheckAndExplain)
 TEST_P(MemoryFaultTest, JsonEndsTheProcessInOrder)
 {
     Spend({"show", "web02.xml", "INV_Package", "-o", "json"});
-    Spend({"compare", "web01.xml", "web02.xml", "-o", "ndjson"});
+    Spend({"compare", "--detail", "web01.xml", "web02.xml", "-o", "ndjson"});
 }
 
 TEST_P(MemoryFaultTest, WrongUsage)

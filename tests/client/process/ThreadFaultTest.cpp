@@ -24,7 +24,7 @@ class ThreadFaultTest : public TClientFixture {
 
 TEST_F(ThreadFaultTest, TheThreadsThatThereAreDoTheWork)
 {
-    const std::vector<std::string> compare = {"compare",   "web01.xml",       "web02.xml.gz",
+    const std::vector<std::string> compare = {"compare",   "--detail",        "web01.xml",    "web02.xml.gz",
                                               "web03.xml", "web01-again.xml", "two-boots.xml"};
     const std::string expected = Result(compare);
     const std::string bad = Scratch("bad.xml", "no XML");
@@ -35,7 +35,7 @@ TEST_F(ThreadFaultTest, TheThreadsThatThereAreDoTheWork)
         EXPECT_EQ(0, gLeft) << "threads are requested";
         gLeft = left;
         EXPECT_EQ("cimdelta: B:1:1: found malformed XML: syntax error\n",
-                  Shorten(Complaint({"compare", "web01.xml", bad, worse, "web02.xml"}), bad, "B"));
+                  Shorten(Complaint({"compare", "--detail", "web01.xml", bad, worse, "web02.xml"}), bad, "B"));
     }
 }
 

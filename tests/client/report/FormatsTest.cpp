@@ -49,7 +49,7 @@ TEST_F(FormatsTest, NdjsonHasADocumentForEachDifferenceAndOneForTheCoverage)
             CoveredClass("INV_Service", "compared", "1,1,1", "1,1,1") + "," +
             CoveredClass("KALMO_OperatingSystem", "reachedByNoElement", "1,1,1", "0,0,0") +
             "],\"classesWithoutInstances\":1,\"schema\":[],\"badValues\":[],\"systemNames\":[],\"hints\":[]}\n",
-        Result({"compare", "-o", "ndjson", "--spec",
+        Result({"compare", "--detail", "-o", "ndjson", "--spec",
                 Scratch("rules", "<DifftoolSpec><class name='INV_Disk' default='include'/><class name='INV_Element' "
                                  "default='include'/></DifftoolSpec>"),
                 "web01.xml", "web02.xml", "web03.xml"}));
@@ -58,9 +58,9 @@ TEST_F(FormatsTest, NdjsonHasADocumentForEachDifferenceAndOneForTheCoverage)
 TEST_F(FormatsTest, JsonHoldsWhatNdjsonHolds)
 {
     const std::vector<std::string> inventories = {"web01.xml", "web02.xml", "web03.xml"};
-    const nlohmann::ordered_json document =
-        nlohmann::ordered_json::parse(Result({"compare", "-o", "json", inventories[0], inventories[1], inventories[2]}));
-    const std::string lines = Result({"compare", "-o", "ndjson", inventories[0], inventories[1], inventories[2]});
+    const nlohmann::ordered_json document = nlohmann::ordered_json::parse(
+        Result({"compare", "--detail", "-o", "json", inventories[0], inventories[1], inventories[2]}));
+    const std::string lines = Result({"compare", "--detail", "-o", "ndjson", inventories[0], inventories[1], inventories[2]});
     std::string rebuilt;
     for (const nlohmann::ordered_json& difference : document["differences"]) {
         rebuilt += difference.dump() + "\n";
@@ -75,7 +75,7 @@ TEST_F(FormatsTest, JsonHoldsWhatNdjsonHolds)
 
 TEST_F(FormatsTest, NotesOnTheSchemaAreInTheCoverage)
 {
-    Run({"compare", "-o", "json", "web01.xml", "other-schema.xml"});
+    Run({"compare", "--detail", "-o", "json", "web01.xml", "other-schema.xml"});
     const nlohmann::ordered_json notes = nlohmann::ordered_json::parse(fOut)["coverage"]["schema"];
     std::string text;
     for (const nlohmann::ordered_json& note : notes) {
@@ -102,7 +102,8 @@ TEST_F(FormatsTest, NotesOnTheSchemaAreInTheCoverage)
 
 TEST_F(FormatsTest, CimXmlHoldsTheRecordsAndLoadsAgain)
 {
-    const std::string records = Scratch("records.xml", Result({"compare", "-o", "cimxml", "web01.xml", "web02.xml", "web03.xml"}));
+    const std::string records =
+        Scratch("records.xml", Result({"compare", "--detail", "-o", "cimxml", "web01.xml", "web02.xml", "web03.xml"}));
     EXPECT_EQ("KALMO_DeltaClass: 3 instances\n"
               "KALMO_Delta: 10 instances\n"
               "KALMO_DeltaClassAssocToDelta: 10 instances\n",

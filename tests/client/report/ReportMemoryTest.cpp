@@ -54,7 +54,9 @@ class ReportMemoryTest : public TClientFixture {
         EXPECT_EQ(static_cast<std::size_t>(instances * changed), report.differences->GetCounts().GetTotal());
         const TMemoryMeter meter;
         fLength = 0;
-        WriteReport(report, format, false, [this](std::string_view piece) { fLength += piece.size(); });
+        TTextOptions options;
+        options.isDetailed = true;
+        WriteReport(report, format, options, [this](std::string_view piece) { fLength += piece.size(); });
         return meter.GetPeak();
     }
 

@@ -61,7 +61,7 @@ TEST_F(ReducedReferencesTest, AKeyOfAnUndeclaredClassIsNamedIfAReferenceHasIt)
     const std::string words = "compared without key Foo and without their namespace";
     EXPECT_NE(std::string::npos, Result({"check", rules, "--schema", a}).find("; references " + words + "\n")) << fOut;
     EXPECT_NE(std::string::npos, fOut.find("NetworkMount.Server are " + words + "\n")) << fOut;
-    Run({"compare", "--spec", rules, a, Scratch("b.xml", MountOf(Path("Nowhere", "Foo", "2")))});
+    Run({"compare", "--detail", "--spec", rules, a, Scratch("b.xml", MountOf(Path("Nowhere", "Foo", "2")))});
     EXPECT_NE(std::string::npos, fOut.find("References of Mount were " + words + ".\n")) << fOut;
 }
 
@@ -93,7 +93,7 @@ TEST_F(ReducedReferencesTest, AKeyThatIsAReferenceIsMatchedWhole)
         const std::string listing = Result({"check", rules, "--schema", a});
         const std::string explained = Shorten(Result({"explain", "Link.A", "--spec", rules, "--schema", a}), rules, "R");
         const std::string warning = listing.substr(std::min(listing.size(), listing.find("those in ")));
-        Run({"compare", "--spec", rules, a, b});
+        Run({"compare", "--detail", "--spec", rules, a, b});
         return warning.substr(0, warning.find('\n') + 1) + explained + fOut.substr(0, fOut.find(" between "));
     };
     EXPECT_EQ("those in FreeLink.B are compared without key Boot and without their namespace\n"

@@ -1,0 +1,88 @@
+#include "client/findings/TShortNames.h"
+
+#include <algorithm>
+#include <boost/algorithm/string/predicate.hpp>
+#include <iterator>
+
+#include "client/text/DisplayText.h"
+#include "client/text/EmbeddedText.h"
+#include "host/TCIMReference.h"
+
+namespace NORVZEL20 {
+
+namespace {
+
+bool IsText(const TCIMValue& value)
+{
+    return value.GetType() == TCIMValue::TCIMType::kString && !value.IsNull();
+}
+
+// CIM's schema has such keys in many classes: CreationClassName, SystemCreationClassName.
+bool RepeatsClass(const std::string& key)
+{
+    return boost::algorithm::iends_with(key, "CreationClassName");
+}
+
+}  // namespace
+
+std::string TShortNames::Of(const TDifference& difference)
+{
+    if (difference.keys.empty()) {
+        return difference.hasKeys ? "(any instance)" : "(the only instance)";
+    }
+    return Join(difference.className, difference.keys);
+}
+
+const TDistinctKeys& TShortNames::Distinct(const std::string& className)
+{
+    const auto known = fClasses.find(className);
+    return known != fClasses.end() ? known->second : fClasses.try_emplace(className, fInventories, className).first->second;
+}
+
+// If no key tells instances apart, there is only one of them. It then goes by the keys that do not merely repeat a class.
+std::string TShortNames::Join(const std::string& className, const TKeys& keys)
+{
+    const TDistinctKeys& distinct = Distinct(className);
+    TKeys left;
+    for (const auto& key : keys) {
+        if (!distinct.IsCommon(key.first, key.second)) {
+            left.push_back(key);
+        }
+    }
+    if (left.empty()) {
+        std::copy_if(keys.begin(), keys.end(), std::back_inserter(left), [](const auto& key) { return !RepeatsClass(key.first); });
+    }
+    if (left.empty()) {
+        left = keys;
+    }
+    if (left.size() == 1 && IsText(left.front().second)) {
+        return Text(distinct, left.front().first, left.front().second);
+    }
+    std::string name;
+    for (const auto& [key, value] : left) {
+        name += (name.empty() ? "" : ",") + EscapeForDisplay(key) + "=" + Text(distinct, key, value);
+    }
+    return name;
+}
+
+// A reference into the inventory itself by the short name of its instance, behind the name of its class if that is not always the
+// same.
+std::string TShortNames::Text(const TDistinctKeys& distinct, const std::string& key, const TCIMValue& value)
+{
+    if (value.IsNull() || value.GetType() != TCIMValue::TCIMType::kReference) {
+        return DisplayContents(value);
+    }
+    const TCIMReference path = value;
+    TKeys keys;
+    path.EnumerateKeyBindings([&keys](const std::pair<std::string, TCIMValue>& binding) {
+        keys.push_back(binding);
+        return true;
+    });
+    if (keys.empty() || !path.GetNamespaceName().empty() || !path.GetHost().empty()) {
+        return DisplayContents(value);
+    }
+    const std::string name = Join(path.GetClassName(), keys);
+    return distinct.HasCommonClass(key) ? name : EscapeForDisplay(path.GetClassName()) + ":" + name;
+}
+
+}  // namespace NORVZEL20

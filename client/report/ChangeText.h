@@ -1,0 +1,16 @@
+#pragma once
+
+#include <string>
+
+#include "client/comparison/TValueDifference.h"
+#include "client/report/TInventoryNames.h"
+
+namespace NORVZEL20 {
+
+/// What changed, for people: `500 -> 250`, or of several inventories `500 -> 250 (web02) / NULL (web03..05)`.
+///
+/// Of an array, only what came and went, if that says all: `-noexec +nodev`. Long texts are cut around what differs. Values that
+/// would then look alike are written whole.
+std::string ChangeText(const TValueDifference& change, const TInventoryNames& names, bool isPair);
+
+}  // namespace NORVZEL20

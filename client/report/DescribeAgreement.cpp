@@ -1,0 +1,19 @@
+#include "client/report/DescribeAgreement.h"
+
+#include "client/report/DisplayLabels.h"
+
+namespace NORVZEL20 {
+
+std::string DescribeAgreement(const TComparisonReport& report)
+{
+    const std::string between = " between " + DisplayLabels(report, {0}) + " and " + DisplayOthers(report);
+    if (report.coverage.IsNothingCompared()) {
+        return "Nothing was compared" + between + ".";
+    }
+    if (report.coverage.IsCompleteButForTimes()) {
+        return "No differences" + between + (report.coverage.IsComplete() ? "." : ", times of collection aside.");
+    }
+    return "No differences in what was compared" + between + "; not everything was, see below.";
+}
+
+}  // namespace NORVZEL20

@@ -1,0 +1,15 @@
+#include "client/report/DescribeNameHint.h"
+
+#include "client/text/Counted.h"
+#include "client/text/DisplayText.h"
+
+namespace NORVZEL20 {
+
+std::string DescribeNameHint(const TNameHint& hint)
+{
+    return "Hint: 0 of " + Counted(hint.instances.front(), "instance") + " of " + EscapeForDisplay(hint.className) + " match; " +
+           EscapeForDisplay(hint.property) + " has one value in each inventory: try --self " + EscapeForDisplay(hint.property) +
+           ".";
+}
+
+}  // namespace NORVZEL20

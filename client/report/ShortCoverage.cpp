@@ -1,0 +1,141 @@
+// Only the first line is always there:
+//
+//   330 and 332 instances in 9 classes compared; 9 properties left out by r2.xml (--coverage)
+//   Not compared: 2 classes with 40 and 41 instances: Process, Thread (--coverage)
+//   2 values that did not fit taken as NULL; 3 declarations differ between inventories (--coverage)
+//   Hint: 0 of 350 instances of Disk match; ...
+#include "client/report/ShortCoverage.h"
+
+#include <algorithm>
+#include <boost/algorithm/string/join.hpp>
+#include <vector>
+
+#include "client/report/DescribeNameHint.h"
+#include "client/text/Counted.h"
+#include "client/text/DisplayText.h"
+#include "client/text/SomeOf.h"
+
+namespace NORVZEL20 {
+
+namespace {
+
+const char kSeeCoverage[] = " (--coverage)";
+
+// "330 and 332", or of more than two inventories "330 to 332".
+std::string Range(const std::vector<std::size_t>& counts)
+{
+    if (counts.size() == 2) {
+        return std::to_string(counts[0]) + " and " + std::to_string(counts[1]);
+    }
+    const auto [least, most] = std::minmax_element(counts.begin(), counts.end());
+    return *least == *most ? std::to_string(*least) : std::to_string(*least) + " to " + std::to_string(*most);
+}
+
+std::size_t CountLeftOutByRules(const TCoverage& coverage)
+{
+    std::size_t count = 0;
+    for (const TCoverage::TClass& cls : coverage.classes) {
+        for (const TCoverage::TLeftOut& leftOut : cls.leftOut) {
+            count += leftOut.reason == TCoverage::kLeftOutByRules ? 1 : 0;
+        }
+    }
+    return count;
+}
+
+std::string Compared(const TComparisonReport& report)
+{
+    std::vector<std::size_t> counts;
+    for (std::size_t i = 0; i < report.labels.size(); ++i) {
+        counts.push_back(report.coverage.CountCompared(i));
+    }
+    std::string line = Range(counts) + (counts.size() > 2 ? " instances of each in " : " instances in ") +
+                       Counted(report.coverage.CountComparedClasses(), "class", "classes") + " compared";
+    const std::size_t leftOut = CountLeftOutByRules(report.coverage);
+    if (leftOut > 0) {
+        line += "; " + Counted(leftOut, "property", "properties") + " left out by " + EscapeForDisplay(report.rules);
+    }
+    return line + (report.coverage.IsComplete() ? "" : kSeeCoverage) + "\n";
+}
+
+// Classes of which instances are there that were not compared. Those that the client made do not count.
+std::string NotCompared(const TComparisonReport& report)
+{
+    std::vector<std::string> names;
+    std::vector<std::size_t> counts(report.labels.size(), 0);
+    for (const TCoverage::TClass& cls : report.coverage.classes) {
+        if (cls.state != TCoverage::kCompared && cls.HasOwnInstances()) {
+            names.push_back(EscapeForDisplay(cls.name));
+            for (std::size_t i = 0; i < counts.size(); ++i) {
+                counts[i] += cls.instances[i];
+            }
+        }
+    }
+    if (names.empty()) {
+        return std::string();
+    }
+    return "Not compared: " + Counted(names.size(), "class", "classes") + " with " + Range(counts) +
+           " instances: " + SomeOf(names) + kSeeCoverage + "\n";
+}
+
+void AddSharing(std::vector<std::string>& reservations, const TCoverage& coverage)
+{
+    std::size_t count = 0;
+    for (const TCoverage::TClass& cls : coverage.classes) {
+        for (const std::size_t sharing : cls.sharing) {
+            count += sharing;
+        }
+    }
+    if (count > 0) {
+        reservations.push_back(Counted(count, "instance shares", "instances share") +
+                               " a key with an earlier one, because the rules leave keys out");
+    }
+}
+
+void AddBadValues(std::vector<std::string>& reservations, const TCoverage& coverage)
+{
+    std::size_t asText = 0;
+    std::size_t asNull = 0;
+    for (const TCoverage::TBadValues& bad : coverage.badValues) {
+        (bad.found.isKeptAsText ? asText : asNull) += bad.found.count;
+    }
+    if (asText > 0) {
+        reservations.push_back(Counted(asText, "value") + " that did not fit compared as text");
+    }
+    if (asNull > 0) {
+        reservations.push_back(Counted(asNull, "value") + " that did not fit taken as NULL");
+    }
+}
+
+bool IsAboutDifference(const TSchemaNote& note)
+{
+    return note.kind == TSchemaNote::kTypeDiffers || note.kind == TSchemaNote::kKeysDiffer ||
+           note.kind == TSchemaNote::kArrayTypeDiffers || note.kind == TSchemaNote::kSuperClassDiffers ||
+           note.kind == TSchemaNote::kSpellingDiffers;
+}
+
+void AddDeclarations(std::vector<std::string>& reservations, const TCoverage& coverage)
+{
+    const auto count = static_cast<std::size_t>(std::count_if(coverage.notes.begin(), coverage.notes.end(), &IsAboutDifference));
+    if (count > 0) {
+        reservations.push_back(Counted(count, "declaration differs", "declarations differ") + " between inventories");
+    }
+}
+
+std::string Reservations(const TCoverage& coverage)
+{
+    std::vector<std::string> reservations;
+    AddBadValues(reservations, coverage);
+    AddSharing(reservations, coverage);
+    AddDeclarations(reservations, coverage);
+    return reservations.empty() ? std::string() : boost::algorithm::join(reservations, "; ") + kSeeCoverage + "\n";
+}
+
+}  // namespace
+
+std::string WriteShortCoverage(const TComparisonReport& report)
+{
+    return Compared(report) + NotCompared(report) + Reservations(report.coverage) +
+           (report.coverage.hint ? DescribeNameHint(*report.coverage.hint) + "\n" : std::string());
+}
+
+}  // namespace NORVZEL20

@@ -1,0 +1,170 @@
+// The lines of one class, of two inventories and of more:
+//
+//   - cryptominer   Version 1.0-1, Vendor unknown     an instance that only one side has, with what it holds
+//   ~ rsyslog.Started: TRUE -> FALSE                  a change of one instance
+//   ~ MTU: 1500 -> 9000: eth0, eth1                   the same change of several
+//   ~ Version in 43 instances, 43 distinct changes    many changes of one property, with an example
+//       curl: 7.88.1-10 -> 7.88.1-12   ... 42 more (--detail)
+//
+//   missing in web23: font11, libdev5
+//   only in web07: cryptominer
+//   MTU: 1500 -> 9000 (web19): eth0, eth1
+//
+// A group with more members than a line should have is shortened; what is left out is counted beside the option that shows it.
+#include "client/report/TClassLines.h"
+
+#include <algorithm>
+#include <boost/algorithm/string/join.hpp>
+
+#include "client/report/ChangeText.h"
+#include "client/text/Counted.h"
+#include "client/text/DisplayText.h"
+#include "client/text/ListedText.h"
+
+namespace NORVZEL20 {
+
+namespace {
+
+const char kSharesKey[] = "   (instances share this key: --detail)";
+
+std::string More(std::size_t count)
+{
+    return "... " + std::to_string(count) + " more (--detail)";
+}
+
+}  // namespace
+
+std::string TClassLines::Counts() const
+{
+    const TDifferenceCounts& counts = fFindings.counts;
+    std::vector<std::string> texts;
+    if (counts.onlyInReference > 0) {
+        texts.push_back("-" + std::to_string(counts.onlyInReference));
+    }
+    if (counts.onlyInOthers > 0) {
+        texts.push_back("+" + std::to_string(counts.onlyInOthers));
+    }
+    if (counts.changedInstances > 0) {
+        texts.push_back("~" + std::to_string(counts.changedInstances));
+    }
+    return boost::algorithm::join(texts, " ");
+}
+
+std::vector<TClassLines::TLine> TClassLines::Write()
+{
+    fLines.clear();
+    for (const TPresenceFinding& presence : fFindings.presences) {
+        fIsPair ? AddPresenceOfPair(presence) : AddPresence(presence);
+    }
+    for (const TPropertyFinding& property : fFindings.properties) {
+        AddProperty(property);
+    }
+    return std::move(fLines);
+}
+
+void TClassLines::AddPresence(const TPresenceFinding& presence)
+{
+    std::vector<std::string> names;
+    for (const TPresenceFinding::TExample& example : presence.examples) {
+        names.push_back(example.name);
+    }
+    const bool isMissing = presence.kind == TDifference::kOnlyInReference;
+    fLines.push_back(
+        {(isMissing ? "missing in " : "only in ") + fNames.List(presence.inventories) + ": " + Shorten(names, presence.instances),
+         presence.kind});
+}
+
+void TClassLines::AddPresenceOfPair(const TPresenceFinding& presence)
+{
+    const std::string sign = presence.kind == TDifference::kOnlyInReference ? "- " : "+ ";
+    if (presence.instances <= fMost) {
+        for (const TPresenceFinding::TExample& example : presence.examples) {
+            fLines.push_back({sign + example.name, presence.kind, Contents(example)});
+        }
+        return;
+    }
+    std::vector<std::string> names;
+    for (const TPresenceFinding::TExample& example : presence.examples) {
+        names.push_back(example.name);
+    }
+    fLines.push_back({sign + Counted(presence.instances, "instance") + ": " + Shorten(names, presence.instances), presence.kind});
+}
+
+void TClassLines::AddProperty(const TPropertyFinding& property)
+{
+    if (property.changes > fMost) {
+        return AddManyChanges(property);
+    }
+    for (const TChangeFinding& change : property.examples) {
+        AddChange(change);
+    }
+}
+
+void TClassLines::AddChange(const TChangeFinding& change)
+{
+    const std::string sign = fIsPair ? "~ " : "";
+    const std::string property = EscapeForDisplay(change.change.property);
+    const std::string text = change.instances == 1
+                                 ? change.names.front() + "." + property + ": " + Change(change)
+                                 : property + ": " + Change(change) + ": " + Shorten(change.names, change.instances);
+    fLines.push_back({sign + text, TDifference::kChanged});
+}
+
+void TClassLines::AddManyChanges(const TPropertyFinding& property)
+{
+    const std::string where = fIsPair ? std::string() : " (" + fNames.List(property.inventories) + ")";
+    fLines.push_back({(fIsPair ? "~ " : "") + EscapeForDisplay(property.property) + " in " +
+                          Counted(property.instances, "instance") + where + ", " + Counted(property.changes, "distinct change"),
+                      TDifference::kChanged});
+    const TChangeFinding& example = property.examples.front();
+    fLines.push_back(
+        {"  " + First(example) + ": " + ExampleOf(property) + "   " + More(property.changes - 1), TDifference::kChanged});
+}
+
+// The first of the instances, and how many there are beside it.
+std::string TClassLines::First(const TChangeFinding& change)
+{
+    return change.names.front() + (change.instances == 1 ? std::string() : " and " + Counted(change.instances - 1, "other"));
+}
+
+// The first change. Its inventories are left out if they are those of the property, which stand above it.
+std::string TClassLines::ExampleOf(const TPropertyFinding& property) const
+{
+    const TChangeFinding& example = property.examples.front();
+    const std::vector<TValueDifference::TGroup>& groups = example.change.others;
+    const bool areAll = groups.size() == 1 && groups.front().inventories == property.inventories;
+    return ChangeText(example.change, fNames, fIsPair || areAll) + (example.isShared ? kSharesKey : "");
+}
+
+std::string TClassLines::Change(const TChangeFinding& change) const
+{
+    return ChangeText(change.change, fNames, fIsPair) + (change.isShared ? kSharesKey : "");
+}
+
+// Names of several keys have commas in them.
+std::string TClassLines::Shorten(const std::vector<std::string>& names, std::size_t count) const
+{
+    const std::size_t shown = count <= fMost ? names.size() : std::min(fMost, names.size());
+    const std::vector<std::string> first(names.begin(), names.begin() + static_cast<std::ptrdiff_t>(shown));
+    const bool haveCommas =
+        std::any_of(first.begin(), first.end(), [](const std::string& name) { return name.find(',') != std::string::npos; });
+    const char* const separator = haveCommas ? "; " : ", ";
+    const std::string text = boost::algorithm::join(first, separator);
+    return shown < count ? text + separator + More(count - shown) : text;
+}
+
+// As much of what the instance holds as fits into the line.
+std::string TClassLines::Contents(const TPresenceFinding::TExample& example) const
+{
+    std::string text;
+    for (const auto& [property, value] : example.contents) {
+        const std::string next = (text.empty() ? "" : ", ") + EscapeForDisplay(property) + " " + ListedText(value);
+        if (fOptions.width > 0 && example.name.size() + text.size() + next.size() > fOptions.width) {
+            return text + (text.empty() ? "..." : ", ...");
+        }
+        text += next;
+    }
+    return text;
+}
+
+}  // namespace NORVZEL20

@@ -1,0 +1,54 @@
+#pragma once
+
+#include <cstddef>
+#include <string>
+#include <vector>
+
+#include "client/findings/TClassFindings.h"
+#include "client/report/TInventoryNames.h"
+#include "client/report/TTextOptions.h"
+
+namespace NORVZEL20 {
+
+/// The lines of one class in a grouped report, without the name of the class.
+class TClassLines {
+  public:
+    /// A line, and the kind of difference that colours it. What an instance holds is kept apart, because it stands in a column.
+    struct TLine {
+        std::string text;
+        TDifference::EKind kind;
+        std::string contents = std::string();
+    };
+
+    /// Of each group, at most `most` members are shown; a group of no more is shown whole. All arguments must outlive this.
+    TClassLines(const TClassFindings& findings, const TInventoryNames& names, const TTextOptions& options, bool isPair,
+                std::size_t most)
+        : fFindings(findings), fNames(names), fOptions(options), fIsPair(isPair), fMost(most)
+    {}
+
+    /// `-2 +1 ~43`: what a class with several inventories begins with.
+    std::string Counts() const;
+    /// The lines, those of instances that one side lacks first.
+    std::vector<TLine> Write();
+
+  private:
+    void AddPresence(const TPresenceFinding& presence);
+    void AddPresenceOfPair(const TPresenceFinding& presence);
+    void AddProperty(const TPropertyFinding& property);
+    void AddChange(const TChangeFinding& change);
+    void AddManyChanges(const TPropertyFinding& property);
+    static std::string First(const TChangeFinding& change);
+    std::string ExampleOf(const TPropertyFinding& property) const;
+    std::string Change(const TChangeFinding& change) const;
+    std::string Shorten(const std::vector<std::string>& names, std::size_t count) const;
+    std::string Contents(const TPresenceFinding::TExample& example) const;
+
+    const TClassFindings& fFindings;
+    const TInventoryNames& fNames;
+    const TTextOptions& fOptions;
+    const bool fIsPair;
+    const std::size_t fMost;
+    std::vector<TLine> fLines;
+};
+
+}  // namespace NORVZEL20

@@ -1,0 +1,47 @@
+#pragma once
+
+#include <cstddef>
+#include <string>
+#include <vector>
+
+#include "client/comparison/TComparisonReport.h"
+#include "client/findings/TFindings.h"
+#include "client/report/TClassLines.h"
+#include "client/report/TInventoryNames.h"
+#include "client/report/TTextOptions.h"
+
+namespace NORVZEL20 {
+
+/// A comparison for people: who differs, and what differs, grouped by what changed.
+class TGroupedText {
+  public:
+    /// The arguments must outlive this.
+    TGroupedText(const TComparisonReport& report, const TFindings& findings, const TTextOptions& options)
+        : fReport(report), fFindings(findings), fOptions(options), fNames(report.labels)
+    {}
+
+    /// The whole text, coverage included. Errors: std::bad_alloc.
+    std::string Write() const;
+
+  private:
+    std::string Summary() const;
+    std::string Counts() const;
+    std::string WhoDiffers() const;
+    std::string Findings() const;
+    std::vector<std::string> Lines(std::size_t most) const;
+    std::vector<std::string> Heads() const;
+    TClassLines ClassLines(const TClassFindings& findings, std::size_t most) const;
+    void AppendPair(std::vector<std::string>& all, const std::string& head, const std::vector<TClassLines::TLine>& lines,
+                    std::size_t column) const;
+    void AppendMany(std::vector<std::string>& all, const std::string& head, const std::vector<TClassLines::TLine>& lines) const;
+    std::string Bold(const std::string& text) const;
+    std::string Colored(const TClassLines::TLine& line) const;
+    bool IsPair() const { return fReport.labels.size() == 2; }
+
+    const TComparisonReport& fReport;
+    const TFindings& fFindings;
+    const TTextOptions& fOptions;
+    const TInventoryNames fNames;
+};
+
+}  // namespace NORVZEL20

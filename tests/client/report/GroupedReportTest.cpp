@@ -1,0 +1,289 @@
+#include <gtest/gtest.h>
+#include <sys/stat.h>
+
+#include "tests/client/Documents.h"
+#include "tests/client/TClientFixture.h"
+
+namespace NORVZEL20 {
+namespace {
+
+std::string Texts(const std::string& name, const std::vector<std::string>& values)
+{
+    std::string elements;
+    for (const std::string& value : values) {
+        elements += "<VALUE>" + value + "</VALUE>";
+    }
+    return "<PROPERTY.ARRAY NAME=\"" + name + "\" TYPE=\"string\"><VALUE.ARRAY>" + elements + "</VALUE.ARRAY></PROPERTY.ARRAY>";
+}
+
+std::string Package(const std::string& name, const std::string& version, const std::string& vendor = "Debian")
+{
+    return Instance("Package", Value("Name", name) + Value("Version", version) + Value("Vendor", vendor));
+}
+
+/// Packages of the same version: p1, p2 and so on.
+std::string Packages(std::size_t count, const std::string& version)
+{
+    std::string all;
+    for (std::size_t i = 1; i <= count; ++i) {
+        all += Package("p" + std::to_string(i), version + "-" + std::to_string(i));
+    }
+    return all;
+}
+
+std::string Service(const std::string& name, const std::string& started)
+{
+    return Instance("Service", Value("CreationClassName", "Service") + Value("Name", name) + Value("Started", started, "boolean"));
+}
+
+std::string User(const std::string& name, const std::string& uid, const std::vector<std::string>& groups)
+{
+    return Instance("User", Value("Name", name) + Value("UID", uid, "uint32") + Texts("Groups", groups));
+}
+
+std::string Mount(const std::string& name, const std::vector<std::string>& options)
+{
+    return Instance("Mount", Value("Name", name) + Texts("Options", options));
+}
+
+std::string Adapter(const std::string& name, const std::string& mtu)
+{
+    return Instance("Adapter", Value("Name", name) + Value("MTU", mtu, "uint32"));
+}
+
+std::string Schema()
+{
+    const std::string texts = "<PROPERTY.ARRAY NAME=\"Groups\" TYPE=\"string\"/>";
+    return Class("Package", "", KeyProperty("Name") + Declaration("Version", "string") + Declaration("Vendor", "string")) +
+           Class("Service", "", KeyProperty("CreationClassName") + KeyProperty("Name") + Declaration("Started", "boolean")) +
+           Class("User", "", KeyProperty("Name") + Declaration("UID", "uint32") + texts) +
+           Class("Mount", "", KeyProperty("Name") + "<PROPERTY.ARRAY NAME=\"Options\" TYPE=\"string\"/>") +
+           Class("Adapter", "", KeyProperty("Name") + Declaration("MTU", "uint32"));
+}
+
+/// Compares made systems as a person does, in a folder of its own, and reads the report.
+class GroupedReportTest : public TClientFixture {
+  protected:
+    void SetUp() override
+    {
+        fFolder = ::testing::TempDir() + "cimdelta-grouped-" + std::to_string(getpid());
+        ASSERT_EQ(0, mkdir(fFolder.c_str(), 0700));
+        ASSERT_EQ(0, chdir(fFolder.c_str()));
+    }
+
+    void TearDown() override
+    {
+        for (const std::string& name : fFiles) {
+            unlink(name.c_str());
+        }
+        rmdir(fFolder.c_str());
+    }
+
+    void System(const std::string& name, const std::string& contents)
+    {
+        Write(name + ".xml", Document(NORVZEL20::System() + Schema() + contents));
+        fSystems.push_back(name + ".xml");
+    }
+
+    void Write(const std::string& name, const std::string& text)
+    {
+        std::ofstream(name) << text;
+        fFiles.push_back(name);
+    }
+
+    std::string Compare(const std::vector<std::string>& options = {})
+    {
+        std::vector<std::string> arguments{"compare"};
+        arguments.insert(arguments.end(), fSystems.begin(), fSystems.end());
+        arguments.insert(arguments.end(), options.begin(), options.end());
+        return Result(arguments);
+    }
+
+    /// What stands between the summary and the coverage.
+    std::string Findings(const std::vector<std::string>& options = {})
+    {
+        const std::string report = Compare(options);
+        const std::size_t begin = report.find("\n\n") + 2;
+        return report.substr(begin, report.rfind("\n\n") + 1 - begin);
+    }
+
+    std::string fFolder;
+    std::vector<std::string> fSystems;
+    std::vector<std::string> fFiles;
+};
+
+TEST_F(GroupedReportTest, OfTwoSystemsSaysWhatChangedWhere)
+{
+    const std::string same = Adapter("eth0", "1500") + Mount("/", {"rw"}) + User("root", "0", {"root"});
+    System("web01", same + Package("bash", "5.2") + Service("rsyslog", "TRUE") + Service("ssh", "TRUE"));
+    System("web07", same + Package("bash", "5.2") + Package("cryptominer", "1.0-1", "unknown") + Service("rsyslog", "FALSE") +
+                        Service("ssh", "TRUE") + User("mallory", "1004", {"mallory", "sudo"}));
+    Write("r2.xml", "<DifftoolSpec><class name='Package' default='include'/><class name='Service' default='include'/>"
+                    "<class name='User' default='include'/>"
+                    "<class name='Adapter' default='include'><excludelist><value>MTU</value></excludelist></class>"
+                    "</DifftoolSpec>");
+    EXPECT_EQ("web01 -> web07: 3 differences (+2 instances, 1 value) in 3 of 4 classes\n"
+              "\n"
+              "Package  + cryptominer   Version 1.0-1, Vendor unknown\n"
+              "Service  ~ rsyslog.Started: TRUE -> FALSE\n"
+              "User     + mallory       UID 1004, Groups {mallory, sudo}\n"
+              "\n"
+              "5 and 7 instances in 4 classes compared; 1 property left out by r2.xml (--coverage)\n"
+              "Not compared: 2 classes with 2 and 2 instances: KALMO_OperatingSystem, Mount (--coverage)\n",
+              Compare({"--spec", "r2.xml"}));
+    EXPECT_EQ(1, fStatus);
+}
+
+TEST_F(GroupedReportTest, OfManySystemsSaysFirstWhoIsOdd)
+{
+    const std::string same = User("root", "0", {"root"}) + Service("ssh", "TRUE");
+    const std::string adapters = Adapter("eth0", "1500") + Adapter("eth1", "1500");
+    const std::string mount = Mount("/srv", {"rw", "noexec"}) + Mount("/", {"rw"});
+    const std::string packages = Package("font11", "1") + Package("libdev5", "2");
+    System("web01", same + adapters + mount + packages + Packages(12, "1.0"));
+    System("web07", same + adapters + mount + packages + Packages(12, "1.0") + Package("cryptominer", "1"));
+    System("web19", same + Adapter("eth0", "9000") + Adapter("eth1", "9000") + mount + packages + Packages(12, "1.0"));
+    System("web20", same + adapters + mount + packages + Packages(12, "1.0"));
+    System("web21", same + adapters + mount + packages + Packages(12, "1.1"));
+    System("web22", same + adapters + mount + packages + Packages(12, "1.1"));
+    System("web23", same + adapters + mount + Packages(12, "1.1"));
+    System("web31", same + adapters + Mount("/srv", {"rw"}) + Mount("/", {"rw"}) + packages + Packages(12, "1.0"));
+    EXPECT_EQ("web01 against 7 others: 18 differences; 6 of 7 differ\n"
+              "   14  web23        12  web21, web22        2  web19        1  web07, web31\n"
+              "\n"
+              "Adapter         ~2   MTU: 1500 -> 9000 (web19): eth0, eth1\n"
+              "Mount           ~1   /srv.Options: -noexec (web31)\n"
+              "Package  -2 +1 ~12   missing in web23: font11, libdev5;  only in web07: cryptominer\n"
+              "    Version in 12 instances (web21..23), 12 distinct changes\n"
+              "      p1: 1.0-1 -> 1.1-1   ... 11 more (--detail)\n"
+              "\n"
+              "19 to 22 instances of each in 6 classes compared\n",
+              Compare());
+}
+
+TEST_F(GroupedReportTest, TheSameChangeInManyInstancesIsOneLine)
+{
+    System("a", Package("bind", "1") + Package("dns", "1") + Package("host", "1") + Package("ssh", "3"));
+    System("b", Package("bind", "2") + Package("dns", "2") + Package("host", "2") + Package("ssh", "4"));
+    EXPECT_EQ("Package  ~ Version: 1 -> 2: bind, dns, host\n"
+              "         ~ ssh.Version: 3 -> 4\n",
+              Findings());
+}
+
+TEST_F(GroupedReportTest, SmallGroupsAreWholeAndLargeOnesSayHowManyThereAre)
+{
+    System("a", Packages(9, "1"));
+    System("b", Packages(8, "1"));
+    EXPECT_EQ("Package  - p9   Version 1-9, Vendor Debian\n", Findings());
+    fSystems.pop_back();
+    System("c", Packages(9, "2"));
+    EXPECT_EQ("Package  ~ Version in 9 instances, 9 distinct changes\n"
+              "           p1: 1-1 -> 2-1   ... 8 more (--detail)\n",
+              Findings());
+    fSystems.pop_back();
+    System("d", "");
+    EXPECT_EQ("Package  - 9 instances: p1, p2, p3, p4, p5, p6, p7, p8, ... 1 more (--detail)\n", Findings());
+}
+
+TEST_F(GroupedReportTest, ALimitShortensGroupsButLeavesNoneOut)
+{
+    System("a", Packages(8, "1") + Service("ssh", "TRUE"));
+    System("b", Packages(8, "2") + Service("ssh", "FALSE"));
+    EXPECT_EQ("Package  ~ Version in 8 instances, 8 distinct changes\n"
+              "           p1: 1-1 -> 2-1   ... 7 more (--detail)\n"
+              "Service  ~ ssh.Started: TRUE -> FALSE\n",
+              Findings({"--limit", "3"}));
+    EXPECT_EQ(Findings(), Findings({"--limit", "9"}));
+}
+
+TEST_F(GroupedReportTest, KeysThatAllInstancesShareAreLeftOutOfNames)
+{
+    System("a", Service("ssh", "TRUE") + Service("cron", "TRUE"));
+    System("b", Service("ssh", "FALSE") + Service("cron", "TRUE"));
+    EXPECT_EQ("Service  ~ ssh.Started: TRUE -> FALSE\n", Findings());
+}
+
+TEST_F(GroupedReportTest, AKeyThatTellsAnyTwoInstancesApartStays)
+{
+    const std::string other = Instance("Service", Value("CreationClassName", "Other") + Value("Name", "x"));
+    System("a", Service("ssh", "TRUE"));
+    System("b", Service("ssh", "FALSE"));
+    System("c", Service("ssh", "TRUE") + other);
+    EXPECT_EQ("Service  +1 ~1   only in c: CreationClassName=Other,Name=x\n"
+              "    CreationClassName=Service,Name=ssh.Started: TRUE -> FALSE (b)\n",
+              Findings());
+}
+
+TEST_F(GroupedReportTest, ReferencesInKeysAreAsShortAsTheInstances)
+{
+    const auto needs = [](const std::string& from, const std::string& to) {
+        const auto end = [](const std::string& name, const std::string& service) {
+            return "<PROPERTY.REFERENCE NAME=\"" + name +
+                   "\"><VALUE.REFERENCE><INSTANCENAME CLASSNAME=\"Service\"><KEYBINDING "
+                   "NAME=\"CreationClassName\"><KEYVALUE>Service"
+                   "</KEYVALUE></KEYBINDING><KEYBINDING NAME=\"Name\"><KEYVALUE>" +
+                   service + "</KEYVALUE></KEYBINDING></INSTANCENAME></VALUE.REFERENCE></PROPERTY.REFERENCE>";
+        };
+        return Instance("Needs", end("From", from) + end("To", to));
+    };
+    const std::string end = "\" REFERENCECLASS=\"Service\">" + kKey + "</PROPERTY.REFERENCE>";
+    const std::string schema = Class("Needs", "", "<PROPERTY.REFERENCE NAME=\"From" + end + "<PROPERTY.REFERENCE NAME=\"To" + end);
+    const std::string services = schema + Service("ssh", "TRUE") + Service("net", "TRUE") + Service("cron", "TRUE");
+    System("a", services + needs("ssh", "net"));
+    System("b", services + needs("ssh", "net") + needs("cron", "net"));
+    EXPECT_EQ("Needs  + From=cron\n", Findings());
+    System("c", services + needs("ssh", "net") + needs("ssh", "cron"));
+    EXPECT_EQ("Needs  +2   only in b: From=cron,To=net;  only in c: From=ssh,To=cron\n", Findings());
+}
+
+TEST_F(GroupedReportTest, InventoriesWithTheSameValueStandTogether)
+{
+    System("web01", Adapter("eth0", "1"));
+    System("web02", Adapter("eth0", "2"));
+    System("web03", Adapter("eth0", "3"));
+    System("web04", Adapter("eth0", "2"));
+    System("web05", Adapter("eth0", "2"));
+    EXPECT_EQ("Adapter  ~1   eth0.MTU: 1 -> 2 (all but web03) / 3 (web03)\n", Findings());
+}
+
+TEST_F(GroupedReportTest, ContentsAreCutAtTheWidth)
+{
+    System("a", "");
+    System("b", Package("long", std::string(100, 'v'), "someone"));
+    EXPECT_EQ("Package  + long   Version " + std::string(100, 'v') + ", ...\n", Findings());
+}
+
+TEST_F(GroupedReportTest, OfLongTextsTheChangeIsShown)
+{
+    const std::string text = "A description of a package that goes on and on, until ";
+    System("a", Package("p", "1", text + "it ends in the end of the text that is long"));
+    System("b", Package("p", "1", text + "it stops in the end of the text that is long"));
+    EXPECT_EQ("Package  ~ p.Vendor: ...n, until it ends in the end... -> ...n, until it stops in the end...\n", Findings());
+}
+
+TEST_F(GroupedReportTest, WithoutDifferencesSaysSoInTwoLines)
+{
+    System("a", Service("ssh", "TRUE"));
+    System("b", Service("ssh", "TRUE"));
+    EXPECT_EQ("No differences between a and b.\n"
+              "\n"
+              "2 and 2 instances in 2 classes compared\n",
+              Compare());
+    EXPECT_EQ(0, fStatus);
+}
+
+TEST_F(GroupedReportTest, CoverageShowsAllOfIt)
+{
+    System("a", Service("ssh", "TRUE"));
+    System("b", Service("ssh", "FALSE"));
+    EXPECT_EQ("a -> b: 1 difference (1 value) in 1 of 2 classes\n"
+              "\n"
+              "Service  ~ ssh.Started: TRUE -> FALSE\n"
+              "\n"
+              "Compared: 2 classes; 2 instances of a, 2 instances of b.\n"
+              "4 classes have no instances in any inventory.\n",
+              Compare({"--coverage"}));
+}
+
+}  // namespace
+}  // namespace NORVZEL20
