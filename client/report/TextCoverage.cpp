@@ -279,7 +279,10 @@ class TStatement {
                 fOut += "Namespace of " + Label(i) + ": " + EscapeForDisplay(loaded.namespaceName) +
                         (isFromOptions                                            ? ", as --namespace says"
                          : loaded.namespaceOrigin == TLoadReport::kFromReferences ? ", the one that its references name"
-                                                                                  : ", since its references name several") +
+                         : loaded.namespacesOfReferences.size() > 1
+                             ? ", since its references name several"
+                             : ", since its references into " + EscapeForDisplay(loaded.namespacesOfReferences.front()) +
+                                   " lead to nothing in it") +
                         ".\n";
             }
         }

@@ -27,8 +27,8 @@ namespace NORVZEL20 {
 /// cannot be confused with the punctuation of a path.
 /// Values: a property that an instance does not mention is null, even if it has a default.
 /// References: one without a namespace, or to the document's own namespace and host, is stored without both; letter case, and
-/// slashes at both ends of the name, do not count. If the document names no namespace, its own is the one that all those of its
-/// references name that name any, otherwise root/cimv2. If it names no host, its own is the one that its references name beside
+/// slashes at both ends of the name, do not count. If the document names no namespace, its own is the one that its references
+/// name (see TOwnPlaceSearch), otherwise root/cimv2. If it names no host, its own is the one that its references name beside
 /// that namespace; if they name several, none is its own, and all are kept. A reference that names no host is to the own one. All
 /// or nothing: if a load throws, the namespace is as it was. Errors of every load: TPopulateError with the statuses of
 /// TNamespacePopulator::PopulateFromXMLFile, or kNotSupported (31) if the namespace is not one of the provider "inmem";

@@ -9,9 +9,12 @@
 //    only after its references have been written again. Later instances of its class are held too, for the order.
 #include "embedded/load/TLateInstances.h"
 
+#include <algorithm>
+
 #include "embedded/store/TReferenceAdapter.h"
 #include "embedded/value/ChangeReferences.h"
 #include "host/TCIMReference.h"
+#include "host/TZELException.h"
 
 namespace NORVZEL20 {
 
@@ -28,6 +31,22 @@ void VisitClasses(TCIMValue value, const boost::function<void(const std::string&
         });
         return false;
     });
+}
+
+// Whether the path names a namespace, and leads to an instance of `ns` without it.
+bool IsNamedInstance(const TInMemNamespace& ns, const TCIMReference& path)
+{
+    if (path.GetNamespaceName().empty()) {
+        return false;
+    }
+    TCIMReference local(path);
+    local.SetNamespaceName("");
+    local.SetHost("");
+    try {
+        return ns.FindInstance(local) != nullptr;
+    } catch (const TZELException&) {
+        return false;  // its keys are not those of the class, so it leads nowhere here
+    }
 }
 
 }  // namespace
@@ -61,6 +80,19 @@ void TLateInstances::AdaptReferences(TOwnPlaceSearch& place, const TInMemNamespa
             instance->SetSlot(slot, std::move(value));
         }
     }
+}
+
+bool TLateInstances::LeadTo(const TInMemNamespace& ns) const
+{
+    return std::any_of(fReferences.begin(), fReferences.end(), [&ns](const auto& noted) {
+        TCIMValue value = noted.first->GetSlotValue(noted.second);
+        bool isFound = false;
+        ChangeReferences(value, [&](TCIMValue& reference) {
+            isFound = isFound || IsNamedInstance(ns, reference);
+            return false;
+        });
+        return isFound;
+    });
 }
 
 void TLateInstances::MakeReferencesLocal(TOwnPlaceSearch& place)

@@ -178,10 +178,11 @@ void TLoader::Finish(const TReadObjects& readObjects)
     for (const TDraft& draft : fLate.TakeDrafts()) {
         Fill(draft, readObjects);
     }
-    fContext.GetOwnPlace().Decide();
-    fOwnPlace = fContext.GetOwnPlace().GetNamed();
+    TOwnPlaceSearch& place = fContext.GetOwnPlace();
+    place.Decide(place.IsMixed() && fLate.LeadTo(*fNamespace));
+    fOwnPlace = place.GetNamed();
     fClasses.MakeDefaultsLocal();
-    fLate.MakeReferencesLocal(fContext.GetOwnPlace());
+    fLate.MakeReferencesLocal(place);
     for (const TLateInstances::THeld& held : fLate.TakeHeld()) {
         const TLoadContext::TAt at(fContext, held.place);
         Add(held.instance);

@@ -4,8 +4,9 @@
 // of their namespace or host differs. Which namespace that is, the document may say itself, before its first object, in the middle
 // or never; and it may name the namespace without the host. What it does not say follows from its references:
 //
-//     namespace   the one that all of those name which name any: some writers leave it out of a reference here and there. If they
-//                 name several, the one that the options of the load give, otherwise root/cimv2
+//     namespace   the one that all of them name. If some name none, the one that all others name is either the own one, which the
+//                 writer left out here and there, or a foreign one: it is the own one if any reference into it leads to an
+//                 instance of the document. Otherwise the one that the options of the load give, or root/cimv2
 //     host        the one that all of those name which name one beside that namespace; if they name several, none is known to be
 //                 the own one, and all stay in the paths
 //
@@ -21,6 +22,7 @@ namespace NORVZEL20 {
 TOwnPlaceSearch::EAnswer TOwnPlaceSearch::Classify(const std::string& name, const std::string& host)
 {
     if (name.empty()) {
+        fIsAnyNameless = true;
         return kForeign;
     }
     // What the document has named itself does not change any more.
@@ -71,14 +73,14 @@ bool TOwnPlaceSearch::MakePathLocal(TCIMValue& value, bool& isOpen)
     return isChanged;
 }
 
-void TOwnPlaceSearch::Decide()
+void TOwnPlaceSearch::Decide(bool leadsHere)
 {
     fReport.referencesNameNamespace = HasOpen();
     if (!fReport.namesNamespace) {
         for (const auto& named : fNamed) {
             fReport.namespacesOfReferences.push_back(named.first);
         }
-        if (fNamed.size() == 1) {
+        if (fNamed.size() == 1 && (leadsHere || !fIsAnyNameless)) {
             fReport.namespaceName = fNamed.begin()->first;
             fReport.namespaceOrigin = TLoadReport::kFromReferences;
         }

@@ -33,11 +33,14 @@ class CIMDELTA_INTERNAL_EXPORT TOwnPlaceSearch {
     /// objects. Returns whether one of them is open.
     bool MakeLocal(TCIMValue& value);
 
+    /// Whether all references that name a namespace name one and the same, and others name none.
+    bool IsMixed() const noexcept { return fIsAnyNameless && fNamed.size() == 1; }
     /// Whether any reference has been open.
     bool HasOpen() const noexcept { return !fNamed.empty(); }
     /// Decides about the open references. Call it when the document has ended and all its references have been classified. Gives
-    /// the report the namespace if the document names none itself.
-    void Decide();
+    /// the report the namespace if the document names none itself. `leadsHere` says whether an open reference leads to an instance
+    /// of the document; it matters if IsMixed.
+    void Decide(bool leadsHere);
     /// The place that the document has named so far, or that was decided on.
     TOwnPlace GetNamed() const;
 
@@ -51,7 +54,8 @@ class CIMDELTA_INTERNAL_EXPORT TOwnPlaceSearch {
     bool MakePathLocal(TCIMValue& value, bool& isOpen);
 
     TLoadReport& fReport;
-    TNameMap<THosts> fNamed;  // by namespace
+    TNameMap<THosts> fNamed;      // by namespace
+    bool fIsAnyNameless = false;  // whether a reference names no namespace
     bool fIsDecided = false;
     bool fIsAnyHostOwn = false;  // the references name one host at most, and the document names none
 };

@@ -241,8 +241,25 @@ class Inventory:
         for element in root.iter("CLASSPATH", "LOCALCLASSPATH", "INSTANCEPATH", "LOCALINSTANCEPATH", "IMETHODCALL"):
             if element.getparent().tag != "VALUE.REFERENCE" and place_of(element):
                 return place_of(element)
-        named = {place_of(reference[0]) for reference in root.iter("VALUE.REFERENCE")}
-        return named.pop() if len(named) == 1 and None not in named else ("", "root/cimv2")
+        references = [reference[0] for reference in root.iter("VALUE.REFERENCE")]
+        named = {place_of(target) for target in references}
+        places = named - {None}
+        if len(places) != 1 or (None in named and not self.leads_here(references)):
+            return ("", "root/cimv2")
+        return places.pop()
+
+    def leads_here(self, references):
+        """Whether any reference that names its place leads to an instance of the document."""
+        there = set()
+        for element in self.root.iter("INSTANCE"):
+            name = element.get("CLASSNAME").lower()
+            keys = {lower: p.type for lower, p in self.schema.properties(name).items() if p.is_key}
+            given = {child.get("NAME").lower(): child for child in element if child.tag.startswith("PROPERTY")}
+            there.add((name, frozenset((lower, value_of(given[lower], type_name, self.schema, None))
+                                       for lower, type_name in keys.items() if lower in given)))
+        targets = [target[-1] for target in references if place_of(target)]
+        return any((target.get("CLASSNAME", "").lower(), frozenset(bindings_of(target, self.schema, None))) in there
+                   for target in targets)
 
     def add_static_values(self, element, schema):
         own = self.schema.classes[element.get("NAME").lower()].own

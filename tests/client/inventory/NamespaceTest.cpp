@@ -14,7 +14,8 @@ std::string PathInto(const std::string& ns, const std::string& disk)
 }
 
 /// An inventory with a link for each of the paths.
-std::string Links(const std::vector<std::string>& paths, const std::string& ns = std::string())
+std::string Links(const std::vector<std::string>& paths, const std::string& ns = std::string(),
+                  const std::string& disks = std::string())
 {
     int id = 0;
     std::string contents =
@@ -23,8 +24,10 @@ std::string Links(const std::vector<std::string>& paths, const std::string& ns =
         contents += Instance("Link", Value("Id", std::to_string(++id)) + "<PROPERTY.REFERENCE NAME=\"To\"><VALUE.REFERENCE>" +
                                          path + "</VALUE.REFERENCE></PROPERTY.REFERENCE>");
     }
-    return Document(System() + contents, ns);
+    return Document(System() + contents + disks, ns);
 }
+
+const std::string kDisks = Instance("Disk", Value("Id", "sda")) + Instance("Disk", Value("Id", "sdb"));
 
 /// In which namespace an inventory is that does not name its own.
 class NamespaceTest : public TClientFixture {
@@ -65,7 +68,7 @@ TEST_F(NamespaceTest, TheOptionDecidesIfReferencesNameSeveral)
 
 TEST_F(NamespaceTest, TheOneThatAllReferencesNameIsTakenBeforeTheOption)
 {
-    const std::string file = Scratch("a.xml", Links({PathInto("root/hw", "sda"), Path("Disk", "Id", "sdb")}));
+    const std::string file = Scratch("a.xml", Links({PathInto("root/hw", "sda"), Path("Disk", "Id", "sdb")}, "", kDisks));
     EXPECT_EQ("To Disk.Id=\"sda\"\nTo Disk.Id=\"sdb\"\n", Targets(file));
     EXPECT_EQ("", fErr);
     EXPECT_EQ("To Disk.Id=\"sda\"\nTo Disk.Id=\"sdb\"\n", Targets(file, {"--namespace", "root/x"}));
@@ -85,7 +88,7 @@ TEST_F(NamespaceTest, TheOneThatTheDocumentNamesIsTakenBeforeTheOption)
 TEST_F(NamespaceTest, IdenticalContentsOfTwoNamespacesAreEqual)
 {
     const auto links = [](const std::string& ns) {
-        return Links({PathInto(ns, "sda"), Path("Disk", "Id", "sdb"), PathInto(ns, "sdc")});
+        return Links({PathInto(ns, "sda"), Path("Disk", "Id", "sdb"), PathInto(ns, "sdc")}, "", kDisks);
     };
     const std::string a = Scratch("a.xml", links("root/hw"));
     const std::string b = Scratch("b.xml", links("root/sw"));
@@ -94,6 +97,23 @@ TEST_F(NamespaceTest, IdenticalContentsOfTwoNamespacesAreEqual)
     EXPECT_NE(std::string::npos, report.find("Namespace of a: root/hw, the one that its references name.\n"
                                              "Namespace of b: root/sw, the one that its references name.\n"))
         << report;
+}
+
+/// References without a namespace are to the own one, so another that leads nowhere is foreign: where it leads, matters.
+TEST_F(NamespaceTest, ReferencesIntoForeignNamespacesDiffer)
+{
+    const auto links = [](const std::string& ns) { return Links({PathInto(ns, "lun0"), Path("Disk", "Id", "sdb")}, "", kDisks); };
+    const std::string a = Scratch("a.xml", links("root/hw"));
+    const std::string b = Scratch("b.xml", links("root/sw"));
+    Run({"compare", "--detail", "a=" + a, "b=" + b});
+    EXPECT_EQ(0u, fOut.find("1 difference between a and b: ")) << fOut;
+    EXPECT_NE(std::string::npos,
+              fOut.find("Namespace of a: root/cimv2, since its references into root/hw lead to nothing in it.\n"))
+        << fOut;
+    const std::string doubt = "; say which with --namespace [LABEL=]NAME\n";
+    EXPECT_EQ("cimdelta: a: names no namespace, and its references are to root/hw; taken as root/cimv2" + doubt +
+                  "cimdelta: b: names no namespace, and its references are to root/sw; taken as root/cimv2" + doubt,
+              Shorten(Shorten(fErr, "a=" + a, "a"), "b=" + b, "b"));
 }
 
 TEST_F(NamespaceTest, EachInventoryMayGetItsOwn)

@@ -39,6 +39,12 @@ class OwnPlaceTest : public testing::Test {
     }
 
     /// An instance of C whose R is that reference.
+    static std::string Nameless(const std::string& id)
+    {
+        return L::Instance(
+            "C", id, "<PROPERTY.REFERENCE NAME=\"R\"><VALUE.REFERENCE>" + Name("z") + "</VALUE.REFERENCE></PROPERTY.REFERENCE>");
+    }
+
     static std::string Pointing(const std::string& id, const std::string& host, const std::string& ns = "cimv2")
     {
         return L::Instance("C", id, Reference(host, ns));
@@ -232,11 +238,15 @@ TEST_F(OwnPlaceTest, IfReferencesNameSeveralNamespacesTheDefaultIsTheOwnOne)
     EXPECT_EQ("root/cimv2", fReport.namespaceName);
 }
 
-TEST_F(OwnPlaceTest, ReferencesThatNameNoneDoNotCount)
+TEST_F(OwnPlaceTest, IfSomeNameNoneANamespaceIsForeignThatLeadsToNothingHere)
 {
-    const std::string nameless = L::Instance(
-        "C", "2", "<PROPERTY.REFERENCE NAME=\"R\"><VALUE.REFERENCE>" + Name("z") + "</VALUE.REFERENCE></PROPERTY.REFERENCE>");
-    EXPECT_EQ((TTexts{fLocal, fLocal}), Stored(Classes() + Pointing("1", "", "hw") + nameless, 2));
+    EXPECT_EQ((TTexts{"root/hw:C.Id=\"z\"", fLocal}), Stored(Classes() + Pointing("1", "", "hw") + Nameless("2"), 2));
+    EXPECT_EQ("root/cimv2", fReport.namespaceName);
+}
+
+TEST_F(OwnPlaceTest, IfSomeNameNoneANamespaceIsTheOwnOneThatLeadsToAnInstance)
+{
+    EXPECT_EQ((TTexts{fLocal, fLocal}), Stored(Classes() + Pointing("1", "", "hw") + Nameless("2") + L::Instance("C", "z"), 2));
     EXPECT_EQ("root/hw", fReport.namespaceName);
 }
 
