@@ -18,6 +18,7 @@ struct TFuzzTarget {
 
 void FuzzArguments(std::string_view input);      ///< a command line of the client, one argument a line
 void FuzzEngine(std::string_view input);         ///< throws of dice, from which namespaces and rules are made
+void FuzzHttp(std::string_view input);           ///< recorded answers of HTTP
 void FuzzInventory(std::string_view input);      ///< a CIM-XML document
 void FuzzMof(std::string_view input);            ///< a MOF document and a file that it may include
 void FuzzPath(std::string_view input);           ///< the text of an object path
