@@ -175,7 +175,7 @@ class TCommandLine {
                       console);
     }
 
-    CLI::App fApp{"Compares inventories held as CIM-XML and reports what differs.", "cimdelta"};
+    CLI::App fApp{"Compares inventories held as CIM-XML or MOF and reports what differs.", "cimdelta"};
     TCommands fCommands{fApp};
 };
 

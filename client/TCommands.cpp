@@ -15,9 +15,10 @@ namespace NORVZEL20 {
 
 namespace {
 
-const char kInventoryHelp[] = "[LABEL=]SOURCE[,SOURCE...]; a source is a file of CIM-XML or MOF, plain or compressed with gzip, xz or "
-                              "zstd, a folder of such files, or - "
-                              "for standard input";
+const char kInventoryHelp[] =
+    "[LABEL=]SOURCE[,SOURCE...]; a source is a file of CIM-XML or MOF, plain or compressed with gzip, xz or "
+    "zstd, a folder of such files, or - "
+    "for standard input";
 
 // For check and explain, --schema names the inventories.
 const char kDeclarations[] = "--declarations";
@@ -121,7 +122,10 @@ void TCommands::AddCompare()
     AddStrictSchema(command, fCompare.strictSchema);
     command->add_flag("--detail", fCompare.text.isDetailed, "show each difference on its own, and all of the coverage");
     command->add_flag("--coverage", fCompare.text.hasWholeCoverage, "show all of what was compared and what not");
-    command->add_option("--limit", fCompare.text.mostLines, "shorten groups so that the findings take at most so many lines")
+    command
+        ->add_option("--limit", fCompare.text.mostLines,
+                     "shorten groups until the findings of a text report take no more lines, if they can")
+        ->check(CLI::PositiveNumber)
         ->option_text("LINES");
     command->add_flag("--allow-empty", fCompare.allowEmpty, "do not take it for an error if nothing was compared");
 }

@@ -124,6 +124,13 @@ bool THttpReader::PeekLine(std::string& line)
     return fAt < fBlock.size();
 }
 
+/// Whether the line that PeekLine has found ends in both characters.
+bool THttpReader::IsCrLf() const
+{
+    const std::size_t end = fBlock.find('\n', fAt);
+    return end != std::string::npos && end > fAt && fBlock[end - 1] == '\r';
+}
+
 std::string THttpReader::TakeLine()
 {
     std::string line;
@@ -167,7 +174,8 @@ void THttpReader::ReadHeaders()
 {
     const std::size_t first = fLine;
     std::string line;
-    while (PeekLine(line) && !line.empty()) {
+    bool isThere = PeekLine(line);
+    for (; isThere && !line.empty(); isThere = PeekLine(line)) {
         if (FindHeaderName(line) == 0 && !IsBlankOf(line[0])) {
             Fail("found \"" + line.substr(0, 80) + "\", expected a header of HTTP or an empty line behind the headers");
         }
@@ -179,6 +187,9 @@ void THttpReader::ReadHeaders()
         }
     }
     CheckStatus();
+    if (!isThere) {
+        Fail("the headers of an answer end early; it was cut off, so fetch it again");
+    }
     TakeLine();
     ++fEmpty;
     if (!fStatus.empty() && fStatus[0] == '1') {
@@ -232,6 +243,7 @@ void THttpReader::ReadChunkLength()
                      : "the answer ends in the middle of its chunks; it was cut off, so fetch it again");
     }
     fLeft = static_cast<std::size_t>(std::stoull(std::string(digits), nullptr, 16));
+    fEndsInCrLf = IsCrLf();
     TakeLine();
     fState = EState::kChunk;
     if (fLeft > 0) {
@@ -249,7 +261,8 @@ void THttpReader::ReadChunkLength()
 void THttpReader::EndChunk()
 {
     std::string line;
-    if (PeekLine(line) && !line.empty()) {
+    // A length that is one too large takes the CR of the line end.
+    if (PeekLine(line) && (!line.empty() || (fEndsInCrLf && !IsCrLf()))) {
         Fail("found more bytes than the chunk's length says, expected the end of a line");
     }
     TakeLine();

@@ -35,6 +35,7 @@ class THttpReader : public IByteSource {
     [[noreturn]] void Fail(const std::string& message) const;
     bool Fill();
     bool PeekLine(std::string& line);
+    bool IsCrLf() const;
     std::string TakeLine();
     void BeginMessage();
     void ReadHeaders();
@@ -51,7 +52,8 @@ class THttpReader : public IByteSource {
     std::size_t fAt = 0;    // of the next byte in it
     std::size_t fLine = 1;  // of that byte, bodies included
     EState fState = EState::kBetween;
-    std::size_t fLeft = 0;  // of the body or the chunk
+    std::size_t fLeft = 0;     // of the body or the chunk
+    bool fEndsInCrLf = false;  // the line of the chunk's length
     bool fIsChunked = false;
     bool fHasLength = false;
     std::string fStatus;     // "404 Not Found"; empty if there is no status line

@@ -6,6 +6,7 @@
 
 #include "client/text/DisplayText.h"
 #include "client/text/EmbeddedText.h"
+#include "client/text/InlineText.h"
 #include "host/TCIMReference.h"
 
 namespace NORVZEL20 {
@@ -70,7 +71,7 @@ std::string TShortNames::Join(const std::string& className, const TKeys& keys)
 std::string TShortNames::Text(const TDistinctKeys& distinct, const std::string& key, const TCIMValue& value)
 {
     if (value.IsNull() || value.GetType() != TCIMValue::TCIMType::kReference) {
-        return DisplayContents(value);
+        return InlineText(value);
     }
     const TCIMReference path = value;
     TKeys keys;
@@ -82,7 +83,9 @@ std::string TShortNames::Text(const TDistinctKeys& distinct, const std::string& 
         return DisplayContents(value);
     }
     const std::string name = Join(path.GetClassName(), keys);
-    return distinct.HasCommonClass(key) ? name : EscapeForDisplay(path.GetClassName()) + ":" + name;
+    // Several keys of its own stand in brackets, so that they are not taken for those around it.
+    const std::string inner = name.find(',') == std::string::npos ? name : "(" + name + ")";
+    return distinct.HasCommonClass(key) ? inner : EscapeForDisplay(path.GetClassName()) + ":" + inner;
 }
 
 }  // namespace NORVZEL20

@@ -22,7 +22,8 @@ void SayNamespaceDoubts(const TInventory& inventory, const std::string& given, I
             begin +
             (loaded.namespaceOrigin == TLoadReport::kFromDocuments ? "is in namespace " : "all references are to namespace ") +
             taken + ", so --namespace " + given + " is not used for it");
-    } else if (!named.empty() && (given.empty() ? loaded.namespaceOrigin == TLoadReport::kFromDefault : std::none_of(named.begin(), named.end(), isTaken))) {
+    } else if (!named.empty() && (given.empty() ? loaded.namespaceOrigin == TLoadReport::kFromDefault
+                                                : std::none_of(named.begin(), named.end(), isTaken))) {
         console.Say(begin + "names no namespace, and its references are to " + EscapeForDisplay(SomeOf(named)) + "; taken as " +
                     taken + (given.empty() ? "; say which with --namespace [LABEL=]NAME" : ", as --namespace says"));
     }

@@ -10,6 +10,7 @@
 #include "client/text/CutAround.h"
 #include "client/text/DisplayText.h"
 #include "client/text/EmbeddedText.h"
+#include "client/text/InlineText.h"
 #include "client/text/ListedText.h"
 
 namespace NORVZEL20 {
@@ -22,11 +23,18 @@ struct TElement {
     std::string shown;
 };
 
+// Behind a sign and in front of a blank.
+std::string SignedText(const TCIMValue& element)
+{
+    const bool hasBlank = !element.IsNull() && element.GetString().find(' ') != std::string_view::npos;
+    return hasBlank ? QuoteForDisplay(element.GetString()) : InlineText(element);
+}
+
 std::vector<TElement> ElementsOf(const TCIMValue& array)
 {
     std::vector<TElement> elements;
     for (const TCIMValue& element : array.GetElements()) {
-        elements.push_back({DisplayValue(element), ListedText(element)});
+        elements.push_back({DisplayValue(element), SignedText(element)});
     }
     return elements;
 }
@@ -53,16 +61,18 @@ std::vector<std::string> TakeElementsOnlyIn(std::vector<TElement>& from, const s
     return only;
 }
 
-bool IsFilledArray(const TCIMValue& value)
+// Signs in front of numbers would read as theirs.
+bool IsListOfTexts(const TCIMValue& value)
 {
-    return value.GetType().IsArray() && !value.IsNull() && !value.GetElements().empty();
+    return value.GetType() == TCIMValue::TCIMType::kArrayString && !value.IsNull() && !HasEmbeddedObject(value) &&
+           !value.GetElements().empty();
 }
 
 // The elements that came and went: "-noexec +nodev". Empty if that does not say all, because the order changed too, or if nothing
 // is left of the array.
 std::string ElementsChanged(const TCIMValue& from, const TCIMValue& to)
 {
-    if (from.GetType() != to.GetType() || !IsFilledArray(from) || !IsFilledArray(to)) {
+    if (!IsListOfTexts(from) || !IsListOfTexts(to)) {
         return std::string();
     }
     std::vector<TElement> before = ElementsOf(from);
@@ -85,15 +95,18 @@ std::string ElementsChanged(const TCIMValue& from, const TCIMValue& to)
     return boost::algorithm::join(parts, " ");
 }
 
-// The texts of a list that is all strings need fewer quotes.
+// The text of a value. If all values are plain ones of one type, they are quoted as this line and lists need it; otherwise
+// TValueTexts has found what tells them apart.
 std::string Shown(const TCIMValue& value, const TValueDifference& change, const std::string& text)
 {
-    bool areTexts =
-        value.GetType() == change.reference.GetType() && value.GetType().IsArray() && !HasEmbeddedObject(change.reference);
+    bool arePlain = !HasEmbeddedObject(change.reference);
     for (const TValueDifference::TGroup& group : change.others) {
-        areTexts = areTexts && group.value.GetType() == value.GetType() && !HasEmbeddedObject(group.value);
+        arePlain = arePlain && group.value.GetType() == change.reference.GetType() && !HasEmbeddedObject(group.value);
     }
-    return areTexts ? ListedText(value) : text;
+    if (!arePlain) {
+        return text;
+    }
+    return value.GetType().IsArray() ? ListedText(value) : InlineText(value);
 }
 
 std::string OfGroup(const TValueDifference::TGroup& group, const std::string& text, const TInventoryNames& names, bool isPair)

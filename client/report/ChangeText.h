@@ -9,8 +9,8 @@ namespace NORVZEL20 {
 
 /// What changed, for people: `500 -> 250`, or of several inventories `500 -> 250 (web02) / NULL (web03..05)`.
 ///
-/// Of an array, only what came and went, if that says all: `-noexec +nodev`. Long texts are cut around what differs. Values that
-/// would then look alike are written whole.
+/// Of an array of texts, only what came and went, if some of it stayed in its order: `-noexec +nodev`. Long texts are cut around
+/// what differs. Values that would then look alike are written whole.
 std::string ChangeText(const TValueDifference& change, const TInventoryNames& names, bool isPair);
 
 }  // namespace NORVZEL20

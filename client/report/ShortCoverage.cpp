@@ -8,6 +8,7 @@
 
 #include <algorithm>
 #include <boost/algorithm/string/join.hpp>
+#include <set>
 #include <vector>
 
 #include "client/report/DescribeNameHint.h"
@@ -121,9 +122,27 @@ void AddDeclarations(std::vector<std::string>& reservations, const TCoverage& co
     }
 }
 
-std::string Reservations(const TCoverage& coverage)
+void AddInferred(std::vector<std::string>& reservations, const TComparisonReport& report)
 {
+    std::set<std::string> names;
+    for (const TLoadReport& loaded : report.loads) {
+        for (const TLoadReport::TInferred& inferred : loaded.inferred) {
+            names.insert(inferred.className);
+        }
+    }
+    if (!names.empty()) {
+        reservations.push_back(Counted(names.size(), "class", "classes") + " inferred from instances");
+    }
+}
+
+std::string Reservations(const TComparisonReport& report)
+{
+    const TCoverage& coverage = report.coverage;
     std::vector<std::string> reservations;
+    AddInferred(reservations, report);
+    if (!coverage.names.empty()) {
+        reservations.push_back(Counted(coverage.names.size(), "system") + " compared under another name");
+    }
     AddBadValues(reservations, coverage);
     AddSharing(reservations, coverage);
     AddDeclarations(reservations, coverage);
@@ -134,7 +153,7 @@ std::string Reservations(const TCoverage& coverage)
 
 std::string WriteShortCoverage(const TComparisonReport& report)
 {
-    return Compared(report) + NotCompared(report) + Reservations(report.coverage) +
+    return Compared(report) + NotCompared(report) + Reservations(report) +
            (report.coverage.hint ? DescribeNameHint(*report.coverage.hint) + "\n" : std::string());
 }
 

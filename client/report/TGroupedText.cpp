@@ -213,7 +213,15 @@ void TGroupedText::AppendMany(std::vector<std::string>& all, const std::string& 
     if (presences.empty()) {
         presences.push_back(Colored(lines[next++]));
     }
-    all.push_back(Bold(head) + boost::algorithm::join(presences, ";  "));
+    const std::string joined = boost::algorithm::join(presences, ";  ");
+    if (presences.size() > 1 && fOptions.width > 0 && head.size() + joined.size() > fOptions.width) {
+        all.push_back(Bold(head) + presences.front());
+        for (std::size_t i = 1; i < presences.size(); ++i) {
+            all.push_back("    " + presences[i]);
+        }
+    } else {
+        all.push_back(Bold(head) + joined);
+    }
     for (; next < lines.size(); ++next) {
         all.push_back("    " + Colored(lines[next]));
     }

@@ -120,10 +120,8 @@ std::string DisplayValue(const TCIMValue& value)
         return "NULL";
     }
     const std::string escaped = EscapeForDisplay(text);
-    if (value.GetType() != TCIMValue::TCIMType::kString || StandsBare(text, escaped)) {
-        return escaped;
-    }
-    return QuoteForDisplay(text);
+    const bool isText = value.GetType() == TCIMValue::TCIMType::kString || value.GetType() == TCIMValue::TCIMType::kChar16;
+    return isText && !StandsBare(text, escaped) ? QuoteForDisplay(text) : escaped;
 }
 
 }  // namespace NORVZEL20

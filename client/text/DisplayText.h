@@ -25,9 +25,9 @@ inline constexpr char kBeforeNewValue[] = " -> ";
 inline constexpr char kBetweenValues[] = " / ";
 inline constexpr char kWithThisKey[] = " with this key";
 
-/// A value for people, in one line; NULL for null. Text is put in double quotes if it is empty, begins or ends with a blank, reads
-/// NULL, or holds a quote, a backslash, a character that EscapeForDisplay replaces, or one of the texts above. Within the quotes a
-/// backslash stands before each quote and backslash. Other text is shown as it is.
+/// A value for people, in one line; NULL for null. Text, also of a single character, is put in double quotes if it is empty, begins
+/// or ends with a blank, reads NULL, or holds a quote, a backslash, a character that EscapeForDisplay replaces, or one of the texts
+/// above. Within the quotes a backslash stands before each quote and backslash. Other text is shown as it is.
 std::string DisplayValue(const TCIMValue& value);
 
 }  // namespace NORVZEL20

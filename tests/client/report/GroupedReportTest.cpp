@@ -236,6 +236,41 @@ TEST_F(GroupedReportTest, ReferencesInKeysAreAsShortAsTheInstances)
     EXPECT_EQ("Needs  +2   only in b: From=cron,To=net;  only in c: From=ssh,To=cron\n", Findings());
 }
 
+TEST_F(GroupedReportTest, WhatCameAndWentIsQuotedIfItCouldBeMistaken)
+{
+    System("a", Mount("/", {"x", "c +d"}) + Mount("/b", {"one"}));
+    System("b", Mount("/", {"x", "y", "+z"}) + Mount("/b", {"two"}));
+    EXPECT_EQ("Mount  ~ /.Options: -\"c +d\" +y +\"+z\"\n"
+              "       ~ /b.Options: {one} -> {two}\n",
+              Findings());
+}
+
+TEST_F(GroupedReportTest, NamesAndValuesAreQuotedIfTheyCouldBeMistaken)
+{
+    System("a", Package("p1", "1") + Package("x and 3 others", "1") + Package("a; b", "1"));
+    System("b", Package("p1", "2: p2") + Package("x and 3 others", "2") + Package("a; b", "2"));
+    EXPECT_EQ("Package  ~ Version: 1 -> 2: \"a; b\", \"x and 3 others\"\n"
+              "         ~ p1.Version: 1 -> \"2: p2\"\n",
+              Findings());
+}
+
+TEST_F(GroupedReportTest, LongPresencesStandOnLinesOfTheirOwn)
+{
+    const std::string base = Service("ssh", "TRUE");
+    System("a", base + Packages(8, std::string(10, '1')));
+    System("b", base + Package(std::string(60, 'b'), "1") + Packages(8, std::string(10, '1')));
+    System("c", base + Package(std::string(60, 'c'), "1") + Packages(8, std::string(10, '1')));
+    EXPECT_EQ("Package  +2   only in b: " + std::string(60, 'b') + "\n    only in c: " + std::string(60, 'c') + "\n", Findings());
+}
+
+TEST_F(GroupedReportTest, ALimitIsAPositiveNumber)
+{
+    System("a", "");
+    System("b", "");
+    EXPECT_NE("", Complaint({"compare", "a.xml", "b.xml", "--limit", "-1"}));
+    EXPECT_NE("", Complaint({"compare", "a.xml", "b.xml", "--limit", "0"}));
+}
+
 TEST_F(GroupedReportTest, InventoriesWithTheSameValueStandTogether)
 {
     System("web01", Adapter("eth0", "1"));
