@@ -24,6 +24,7 @@ std::vector<TInventorySources> PrepareFiles(const TCommandFiles& files, TLoading
         inputs.push_back(files.rules);
     }
     CheckOutput(files.output, inputs);
+    loading.output = IsStandardOutput(files.output) ? std::string() : files.output;
     CheckInventoryFiles(toLoad);
     inventories = DropRepeatedInventories(std::move(inventories), fewest, console);
     RequireReadableOnce(inventories, loading.schemaFiles, files.rules);

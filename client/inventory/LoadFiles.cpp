@@ -36,7 +36,7 @@ TLoadReport LoadFiles(const TFilesToLoad& files, const TLoadOptions& load, const
 {
     try {
         TLoadSession session(files.ns, files.name, load);
-        TSourceReader reader(session);
+        TSourceReader reader(session, options.output);
         for (const std::string& file : files.files) {
             reader.Read(file);
         }

@@ -17,6 +17,8 @@ struct TLoadingOptions {
     std::vector<std::string> schemaFiles;
     /// How the command calls the option for `schemas`, for messages.
     std::string schemaOption = "--schema";
+    /// The file that the result replaces, which none that is read may be; empty if the result goes to standard output.
+    std::string output;
     /// Whether classes that nothing declares are declared as their instances suggest.
     bool infersClasses = false;
     /// What becomes of values that do not fit their types.

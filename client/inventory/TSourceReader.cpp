@@ -66,7 +66,7 @@ void TSourceReader::ReadText(TPeekedSource& text, const std::string& path, const
     }
     TMofDocuments& mof = GetMof();
     if (path != "-") {
-        fFolders->Add(FolderOfSource(path));
+        fIncludes->Add(FolderOfSource(path));
     }
     mof.ReadSource(pull, name);
 }
@@ -74,8 +74,8 @@ void TSourceReader::ReadText(TPeekedSource& text, const std::string& path, const
 TMofDocuments& TSourceReader::GetMof()
 {
     if (!fMof) {
-        fFolders = boost::make_shared<TMofFolders>();
-        fMof = std::make_unique<TMofDocuments>(fSession, fFolders);
+        fIncludes = boost::make_shared<TIncludedFiles>(fOutput);
+        fMof = std::make_unique<TMofDocuments>(fSession, fIncludes);
     }
     return *fMof;
 }

@@ -3,11 +3,12 @@
 #include <boost/smart_ptr/shared_ptr.hpp>
 #include <memory>
 #include <string>
+#include <utility>
 
 #include "client/files/TPeekedSource.h"
+#include "client/inventory/TIncludedFiles.h"
 #include "embedded/load/TLoadSession.h"
 #include "embedded/mof/TMofDocuments.h"
-#include "embedded/mof/TMofFolders.h"
 
 namespace NORVZEL20 {
 
@@ -17,11 +18,11 @@ namespace NORVZEL20 {
 /// A file of MOF may include those in its own folder and below it. Threads: as the session.
 class TSourceReader {
   public:
-    /// The session must outlive this.
-    explicit TSourceReader(TLoadSession& session) : fSession(session) {}
+    /// The session must outlive this. `output` is the file of the result, which must not be included; empty for none.
+    TSourceReader(TLoadSession& session, std::string output) : fSession(session), fOutput(std::move(output)) {}
 
-    /// Reads a file, or standard input for "-". Errors: TPopulateError, and TClientError if the file cannot be read or its
-    /// compressed data is damaged.
+    /// Reads a file, or standard input for "-". Errors: TPopulateError, and TClientError if the file cannot be read, its
+    /// compressed data is damaged or it includes the file of the result.
     void Read(const std::string& path);
 
   private:
@@ -29,7 +30,8 @@ class TSourceReader {
     TMofDocuments& GetMof();
 
     TLoadSession& fSession;
-    boost::shared_ptr<TMofFolders> fFolders;
+    const std::string fOutput;
+    boost::shared_ptr<TIncludedFiles> fIncludes;
     std::unique_ptr<TMofDocuments> fMof;  // null before the first file of MOF
 };
 

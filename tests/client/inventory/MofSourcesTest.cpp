@@ -76,6 +76,32 @@ TEST_F(MofSourcesTest, FilesMayBeIncludedFromTheSameFolderAndBelow)
     EXPECT_EQ(0u, Shell("show -", "cat " + (fFolder / "main.mof") + " | ").find("[2]\n--\ncimdelta: standard input:1:"));
 }
 
+TEST_F(MofSourcesTest, TheResultNeverReplacesAnIncludedFile)
+{
+    const std::string all = std::string(kQualifiers) + kDisk + kSda;
+    const std::string included = Write("below/disk.mof", all);
+    const std::string main = Write("main.mof", "#pragma include (\"below/disk.mof\")\n");
+    std::filesystem::create_symlink(included, fFolder / "link.mof");
+    std::filesystem::create_hard_link(included, fFolder / "other.mof");
+    const std::string other = Write("other.xml", Document(Class("Disk", "", KeyProperty("Id"))));
+    for (const std::string& output : {included, fFolder / "below/../below/disk.mof", fFolder / "link.mof", fFolder / "other.mof"}) {
+        for (const std::vector<std::string>& command : std::vector<std::vector<std::string>>{
+                 {"show", main}, {"compare", main, other}, {"compare", other, main}, {"show", other, "--schema", main}}) {
+            std::vector<std::string> arguments = command;
+            arguments.insert(arguments.end(), {"--output", output});
+            EXPECT_EQ("cimdelta: " + output + ": is one of the files that are read, since " + (fFolder / "below/disk.mof") +
+                          " is included; name another file for the result\n",
+                      Complaint(arguments));
+            EXPECT_EQ(all, ReadFile(included));
+        }
+    }
+    for (const std::string& output : {std::string("-"), std::string("/dev/null"), fFolder / "below/new.txt"}) {
+        Run({"show", main, "--output", output});
+        EXPECT_EQ("0 ", std::to_string(fStatus) + " " + fErr) << output;
+    }
+    EXPECT_EQ("Disk: 1 instance\n", ReadFile(fFolder / "below/new.txt"));
+}
+
 TEST_F(MofSourcesTest, MistakesHaveAPlace)
 {
     EXPECT_EQ(0u, Show(Write("a.mof", std::string(kDisk) + "class Disk {")).find("cimdelta: F/a.mof:2:")) << fErr;
