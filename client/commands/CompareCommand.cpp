@@ -32,6 +32,7 @@ void Deliver(const TComparisonReport& report, const TCompareOptions& options, IC
 int RunCompare(const TCompareOptions& options, IConsole& console)
 {
     // Before the inventories, which may take long to load.
+    CheckSystemNames(options.systems);
     const std::optional<TRulesText> rules = ReadRulesIfAny(options.rules);
     std::vector<TInventory> inventories = TInventoryLoader(console, options.loading).Load(options.inventories);
     AlignSystemNames(inventories, options.systems);

@@ -1,6 +1,7 @@
 #include "client/inventory/AlignSystemNames.h"
 
 #include <algorithm>
+#include <cstddef>
 #include <map>
 #include <set>
 #include <string>
@@ -31,6 +32,10 @@ TNames Split(const std::string& option)
     if (names.size() < 2 || std::count(names.begin(), names.end(), "") > 0) {
         throw TClientError("--same " + EscapeForDisplay(option) +
                            " is no list of names; join names that mean one system by equals signs: --same web01=web02");
+    }
+    if (std::count(names.begin(), names.end(), names.front()) == static_cast<std::ptrdiff_t>(names.size())) {
+        throw TClientError("--same " + EscapeForDisplay(option) +
+                           " names one name only; join different names that mean one system: --same web01=web02");
     }
     return names;
 }
@@ -173,6 +178,11 @@ void Replace(TInventory& inventory)
 }
 
 }  // namespace
+
+void CheckSystemNames(const TSystemNames& options)
+{
+    ReadSame(options.same);
+}
 
 void AlignSystemNames(std::vector<TInventory>& inventories, const TSystemNames& options)
 {

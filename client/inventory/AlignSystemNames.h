@@ -7,8 +7,12 @@
 
 namespace NORVZEL20 {
 
+/// Checks the options, for which no inventory is needed. Errors: TClientError if names that mean one system are not at least two.
+void CheckSystemNames(const TSystemNames& options);
+
 /// Writes the names by which the inventories call their own systems as the reference has them, in keys and references, and notes in
-/// TInventory::ownNames what was done. Does nothing without such options. Call it before the schemas are completed.
+/// TInventory::ownNames what was done. Does nothing without such options, which must have passed
+/// CheckSystemNames. Call it before the schemas are completed.
 ///
 /// Of several names that mean one system, an inventory's own is the one that it has most often in keys and references; of the
 /// reference, it is the one that is used for all. A name that an inventory does not have may be its label instead: its own name is

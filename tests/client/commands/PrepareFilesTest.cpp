@@ -46,6 +46,13 @@ TEST_F(PrepareFilesTest, AMissingInventoryIsKnownBeforeOthersAreRead)
     EXPECT_EQ("[2]\n--\ncimdelta: standard input: cannot be read: it is closed\n", Shell("compare " + fSlow + " - <&-"));
 }
 
+TEST_F(PrepareFilesTest, WrongNamesOfSystemsAreKnownBeforeInventoriesAreRead)
+{
+    for (const std::string names : {"web01", "=web02", "web01=", "web01==web02", "web01=web01", "a=a=a"}) {
+        EXPECT_EQ(0u, Complaint({"compare", fSlow, "web02.xml", "--same", names}).find("cimdelta: --same " + names + " ")) << fErr;
+    }
+}
+
 TEST_F(PrepareFilesTest, AnOutputThatCannotBeWrittenIsKnownBeforeInventoriesAreRead)
 {
     ASSERT_EQ(0, mkdir((fFolder / "folder").c_str(), 0777));

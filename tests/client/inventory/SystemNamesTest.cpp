@@ -206,6 +206,8 @@ TEST_F(SystemNamesTest, WhatIsAmbiguousOrMissingIsRefused)
               Compare({ArrayOf("array1", 1), ArrayOf("array2", 1)}, {"--same", "x=y"}));
     EXPECT_EQ("cimdelta: --same array1 is no list of names; join names that mean one system by equals signs: --same web01=web02\n",
               Compare({two, two}, {"--same", "array1"}));
+    EXPECT_EQ("cimdelta: --same a=a names one name only; join different names that mean one system: --same web01=web02\n",
+              Compare({two, two}, {"--same", "a=a"}));
     EXPECT_EQ("cimdelta: --self excludes --same; see cimdelta compare --help\n", Compare({two, two}, {"--same", "a=b", "--self"}));
 }
 
