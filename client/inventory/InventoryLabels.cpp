@@ -4,6 +4,8 @@
 #include <set>
 #include <string_view>
 
+#include <boost/algorithm/string/predicate.hpp>
+
 #include "client/process/TClientError.h"
 #include "client/text/DisplayText.h"
 
@@ -11,10 +13,10 @@ namespace NORVZEL20 {
 
 namespace {
 
-// Removes the suffix, unless the name is nothing else.
+// Removes the suffix in any letter case, unless the name is nothing else.
 bool TakeOff(std::string& name, std::string_view suffix)
 {
-    if (name.size() <= suffix.size() || name.compare(name.size() - suffix.size(), suffix.size(), suffix) != 0) {
+    if (name.size() <= suffix.size() || !boost::algorithm::iends_with(name, suffix)) {
         return false;
     }
     name.resize(name.size() - suffix.size());
@@ -40,7 +42,7 @@ std::string ShortName(const std::string& path)
     std::string name = trimmed.substr(trimmed.rfind('/') + 1);
     // The suffix of the compression comes last in the name, so it is taken off first.
     TakeOffOneOf(name, {".gz", ".xz", ".zst"});
-    TakeOffOneOf(name, {".xml", ".cimxml", ".cim"});
+    TakeOffOneOf(name, {".xml", ".cimxml", ".cim", ".mof"});
     return name.empty() ? path : name;
 }
 

@@ -24,6 +24,12 @@ TEST(InventoryLabels, AreFileNamesWithoutDirectoryAndSuffixes)
               Labels({"/srv/web01.xml", "web02.xml.gz", "../x/web03.cimxml.xz", "web04.example.org.xml.zst"}));
 }
 
+TEST(InventoryLabels, LackSuffixesInAnyLetterCase)
+{
+    EXPECT_EQ("web01|web02|web03|web04|web05.response|.MOF",
+              Labels({"web01.mof", "web02.XML", "web03.Mof.GZ", "web04.CIM", "web05.response", ".MOF"}));
+}
+
 TEST(InventoryLabels, ArePathsWhereNamesAreAlike)
 {
     EXPECT_EQ("old/web01.xml|new/web01.xml|b", Labels({"old/web01.xml", "new/web01.xml", "b.xml"}));
