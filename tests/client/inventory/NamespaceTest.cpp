@@ -136,5 +136,25 @@ TEST_F(NamespaceTest, EachInventoryMayGetItsOwn)
               Complaint({"compare", a, b, "--namespace", "x", "--namespace", "y"}));
 }
 
+TEST_F(NamespaceTest, AWrongNameIsRefusedBeforeInventoriesAreRead)
+{
+    const std::string a = "a=" + Scratch("a.xml", "no XML");
+    const std::string expected = ", expected the name of a namespace, such as root/cimv2, without blanks, colons and quotes\n";
+    const struct {
+        std::string option;
+        std::string message;
+    } rows[] = {
+        {"a=", "a=: found no name, expected [LABEL=]NAME, such as root/cimv2\n"},
+        {"//", "//: found no name, expected [LABEL=]NAME, such as root/cimv2\n"},
+        {"=x", "=x: found an empty label, expected [LABEL=]NAME\n"},
+        {"a b", "a b: found \"a b\"" + expected},
+        {"a=root/hw ", "a=root/hw : found \"root/hw \"" + expected},
+        {"a=http://host/root", "a=http://host/root: found \"http://host/root\"" + expected},
+    };
+    for (const auto& row : rows) {
+        EXPECT_EQ("cimdelta: --namespace " + row.message, Complaint({"show", a, "--namespace", row.option}));
+    }
+}
+
 }  // namespace
 }  // namespace NORVZEL20
