@@ -6,7 +6,7 @@
 #include <vector>
 
 #include "client/AddText.h"
-#include "client/BracketGuard.h"
+#include "client/ArgumentGuard.h"
 #include "client/text/Alternatives.h"
 
 namespace NORVZEL20 {
@@ -28,7 +28,7 @@ void AddBadValues(CLI::App* command, EBadValues& choice)
             "--bad-values", set,
             "what becomes of values that do not fit their types: refuse the inventory (the default), take them as\n"
             "null, or keep and compare them as text")
-        ->transform(&UnguardBrackets)
+        ->transform(&UnguardArgument)
         ->check(&RefuseEmpty)
         ->option_text("CHOICE");
 }

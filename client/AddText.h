@@ -3,7 +3,7 @@
 #include <CLI/CLI.hpp>
 #include <string>
 
-#include "client/BracketGuard.h"
+#include "client/ArgumentGuard.h"
 
 namespace NORVZEL20 {
 
@@ -17,7 +17,7 @@ inline std::string RefuseEmpty(const std::string& text)
 template <class TTarget>
 CLI::Option* AddText(CLI::App* command, const char* name, TTarget& target, const char* description)
 {
-    return command->add_option(name, target, description)->transform(&UnguardBrackets)->check(&RefuseEmpty);
+    return command->add_option(name, target, description)->transform(&UnguardArgument)->check(&RefuseEmpty);
 }
 
 }  // namespace NORVZEL20

@@ -14,7 +14,7 @@
 #include <sstream>
 
 #include "client/AddSystemNames.h"
-#include "client/BracketGuard.h"
+#include "client/ArgumentGuard.h"
 #include "client/TCommands.h"
 #include "client/WrongUsage.h"
 #include "client/process/ExitStatus.h"
@@ -37,7 +37,7 @@ std::string UnknownOption(const CLI::App& command)
 {
     for (const std::string& argument : command.remaining()) {
         if (IsOption(argument)) {
-            return UnguardBrackets(argument.substr(0, argument.find('=')));
+            return UnguardArgument(argument.substr(0, argument.find('=')));
         }
     }
     return std::string();
@@ -81,7 +81,7 @@ class TCommandLine {
             return Refuse(wrong, console);
         }
         arguments = JoinSelf(arguments);
-        std::transform(arguments.begin(), arguments.end(), arguments.begin(), &GuardBrackets);
+        std::transform(arguments.begin(), arguments.end(), arguments.begin(), &GuardArgument);
         std::reverse(arguments.begin(), arguments.end());  // CLI11 wants the last argument first
         try {
             fApp.parse(std::move(arguments));
@@ -170,7 +170,7 @@ class TCommandLine {
             return Refuse(wrong, console);
         }
         return Refuse(chosen.empty() ? "name a command: " + Alternatives(CommandNames()) + "; see cimdelta --help"
-                                     : UnguardBrackets(DescribeWrongUsage(error, fApp, *chosen[0])) + "; see cimdelta " +
+                                     : UnguardArgument(DescribeWrongUsage(error, fApp, *chosen[0])) + "; see cimdelta " +
                                            chosen[0]->get_name() + " --help",
                       console);
     }

@@ -6,7 +6,7 @@
 #include "client/AddLoadingOptions.h"
 #include "client/AddSystemNames.h"
 #include "client/AddText.h"
-#include "client/BracketGuard.h"
+#include "client/ArgumentGuard.h"
 #include "client/commands/PrepareFiles.h"
 #include "client/report/OutputFormats.h"
 #include "client/text/Alternatives.h"
@@ -39,7 +39,7 @@ void AddFormat(CLI::App* command, EOutputFormat& format)
         format = OutputFormatOf(name);
     };
     command->add_option_function("-o,--format", set, Alternatives(OutputFormatNames()) + " (default: text)")
-        ->transform(&UnguardBrackets)
+        ->transform(&UnguardArgument)
         ->check(&RefuseEmpty)
         ->option_text("FORMAT");
 }

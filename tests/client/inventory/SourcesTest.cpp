@@ -128,6 +128,17 @@ TEST_F(SourcesTest, AFileIsReadOnceInAnInventory)
     EXPECT_EQ("cimdelta: F/again.xml: is the same file as F/a.xml; it is used once\n", Notes({"show", fFolder.GetPath()}));
 }
 
+TEST_F(SourcesTest, StandardInputMayComeFirst)
+{
+    const std::string disks = Write("disks.xml", Disk("sda"));
+    const std::string classes = "cat " + Write("classes.xml", kDiskClass) + " | ";
+    EXPECT_EQ("[0]\nDisk: 1 instance\n--\n", Shell("show -," + disks, classes));
+    const std::string asSchema = Shell("show " + disks + " --schema -," + Write("x.xml", System()), classes);
+    EXPECT_EQ(0u, asSchema.find("[0]\nDisk: 1 instance\n--\n")) << asSchema;
+    EXPECT_EQ("cimdelta: -,: found an empty source, expected [LABEL=]SOURCE[,SOURCE...]; name a file, a folder or -\n",
+              Message({"show", "-,"}));
+}
+
 TEST_F(SourcesTest, InventoriesOfTheSameFilesAreOne)
 {
     const std::string a = Write("a.xml", kDiskClass);
