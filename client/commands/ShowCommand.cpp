@@ -24,7 +24,11 @@ std::string Write(const TInventory& inventory, const TShowOptions& options)
 int RunShow(const TShowOptions& options, IConsole& console)
 {
     const TInventory inventory = TInventoryLoader(console, options.loading).LoadOne(options.inventory);
-    DeliverResult(console, options.output, Write(inventory, options));
+    const std::string text = Write(inventory, options);
+    if (text.empty() && options.className.empty()) {
+        console.Say("cimdelta: " + inventory.label + ": has no class, only qualifiers");
+    }
+    DeliverResult(console, options.output, text);
     return kExitSuccess;
 }
 

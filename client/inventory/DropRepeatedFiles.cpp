@@ -5,6 +5,7 @@
 
 #include "client/files/TFileIdentity.h"
 #include "client/process/TClientError.h"
+#include "client/text/SomeOf.h"
 
 namespace NORVZEL20 {
 
@@ -80,6 +81,18 @@ void SayAll(const std::map<std::string, std::string>& notes, IConsole& console)
     }
 }
 
+// A folder that is named twice would give a note for each of its files.
+const std::size_t kMostNotes = 3;
+
+void SayTogether(const std::map<std::string, std::string>& notes, IConsole& console)
+{
+    std::vector<std::string> names;
+    for (const auto& note : notes) {
+        names.push_back(note.first);
+    }
+    console.Say("cimdelta: these files come more than once, each is used once: " + SomeOf(names));
+}
+
 }  // namespace
 
 std::vector<std::string> DropRepeatedFiles(const std::vector<std::string>& paths, IConsole& console)
@@ -93,7 +106,11 @@ std::vector<std::string> DropRepeatedFiles(const std::vector<std::string>& paths
     for (const std::size_t i : FindDifferent(files, notes)) {
         different.push_back(paths[i]);
     }
-    SayAll(notes, console);
+    if (notes.size() <= kMostNotes) {
+        SayAll(notes, console);
+    } else {
+        SayTogether(notes, console);
+    }
     return different;
 }
 

@@ -102,6 +102,14 @@ TEST_F(MofSourcesTest, TheResultNeverReplacesAnIncludedFile)
     EXPECT_EQ("Disk: 1 instance\n", ReadFile(fFolder / "below/new.txt"));
 }
 
+TEST_F(MofSourcesTest, QualifiersAloneAreNothingToShow)
+{
+    EXPECT_EQ("", Show(Write("q.mof", kQualifiers)));
+    EXPECT_EQ("cimdelta: q: has no class, only qualifiers\n", fErr);
+    Show(Write("disk.mof", std::string(kQualifiers) + kDisk));
+    EXPECT_EQ("", fErr);
+}
+
 TEST_F(MofSourcesTest, MistakesHaveAPlace)
 {
     EXPECT_EQ(0u, Show(Write("a.mof", std::string(kDisk) + "class Disk {")).find("cimdelta: F/a.mof:2:")) << fErr;

@@ -128,6 +128,24 @@ TEST_F(SourcesTest, AFileIsReadOnceInAnInventory)
     EXPECT_EQ("cimdelta: F/again.xml: is the same file as F/a.xml; it is used once\n", Notes({"show", fFolder.GetPath()}));
 }
 
+TEST_F(SourcesTest, ManyFilesThatComeTwiceAreOneNote)
+{
+    const std::string folder = fFolder / "web01";
+    Write("web01/1.xml", kDiskClass);
+    for (const std::string id : {"2", "3", "4"}) {
+        Write("web01/" + id + ".xml", Disk(id));
+    }
+    EXPECT_EQ("cimdelta: these files come more than once, each is used once: F/web01/1.xml, F/web01/2.xml, F/web01/3.xml, "
+              "F/web01/4.xml\n",
+              Notes({"show", folder + "," + folder}));
+    EXPECT_EQ("Disk: 3 instances\n", fOut);
+    std::filesystem::remove(folder + "/4.xml");
+    EXPECT_EQ("cimdelta: F/web01/1.xml: is named more than once; it is used once\n"
+              "cimdelta: F/web01/2.xml: is named more than once; it is used once\n"
+              "cimdelta: F/web01/3.xml: is named more than once; it is used once\n",
+              Notes({"show", folder + "," + folder}));
+}
+
 TEST_F(SourcesTest, StandardInputMayComeFirst)
 {
     const std::string disks = Write("disks.xml", Disk("sda"));
