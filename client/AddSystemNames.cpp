@@ -27,7 +27,9 @@ void AddSystemNames(CLI::App* command, TSystemNames& names)
     CLI::Option* const self = command->add_flag(
         std::string(kSelf) + "{" + kSystemNameProperty + "}", names.self,
         "find in this property the name by which each inventory calls its own system, and compare keys\n"
-        "and references as if all had the reference's (default: SystemName, or Name of the one computer\nsystem)");
+        "and references as if all had the reference's (default: SystemName, or Name of the one computer\nsystem); write "
+        "--self=PROPERTY if a file may be called like the property");
+    self->option_text("[PROPERTY]");
     AddText(command, "--same", names.same,
             "names that mean the same system, such as web01=web02: in keys and references, each inventory's\n"
             "own one is compared as the reference's; repeat the option for other systems")

@@ -67,6 +67,13 @@ void AddStrictSchema(CLI::App* command, bool& strictSchema)
 // Names the options that a command cannot do without in its first line.
 class THelp : public CLI::Formatter {
   public:
+    // Without the value in braces that a flag has if none is given.
+    std::string make_option_name(const CLI::Option* option, bool isPositional) const override
+    {
+        const std::string name = CLI::Formatter::make_option_name(option, isPositional);
+        return name.substr(0, name.find('{'));
+    }
+
     std::string make_usage(const CLI::App* command, std::string name) const override
     {
         std::string usage = CLI::Formatter::make_usage(command, name);

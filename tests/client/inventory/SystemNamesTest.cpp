@@ -52,6 +52,13 @@ class SystemNamesTest : public TDocumentsFixture {
     }
 };
 
+TEST_F(SystemNamesTest, TheHelpShowsThatThePropertyMayBeLeftOut)
+{
+    const std::string help = Result({"compare", "--help"});
+    EXPECT_NE(std::string::npos, help.find("\n  --self [PROPERTY]  ")) << help;
+    EXPECT_EQ(std::string::npos, help.find('{')) << help;
+}
+
 TEST_F(SystemNamesTest, WithoutTheOptionNothingMatches)
 {
     EXPECT_EQ("1402 differences between a and b: 701 instances only in a, 701 instances only in b",
