@@ -42,6 +42,16 @@ TLoadReport LoadFiles(const TFilesToLoad& files, const TLoadOptions& load, const
         }
         return session.Commit();
     } catch (const TPopulateError& error) {
+// How often it was tolerated; follows its text. Empty for once.
+std::string CountTolerated(const TLoadReport::TTolerated& tolerated)
+{
+    const std::size_t same = tolerated.count - tolerated.others;
+    const std::string times = same > 1 ? std::to_string(same) + " times" : "";
+    const std::string others = tolerated.others > 0 ? std::to_string(tolerated.others) + " more of this kind" : "";
+    const std::string all = times + (times.empty() || others.empty() ? "" : ", ") + others;
+    return all.empty() ? "" : " (" + all + ")";
+}
+
         throw TClientError(error.what() + NameOptions(error.GetAdvice(), options));
     } catch (const TZELException& error) {
         ThrowIfOutOfMemory(error);
@@ -52,9 +62,8 @@ TLoadReport LoadFiles(const TFilesToLoad& files, const TLoadOptions& load, const
 void SayTolerated(const TLoadReport& report, IConsole& console)
 {
     for (const TLoadReport::TTolerated& tolerated : report.tolerated) {
-        const std::string times = tolerated.count > 1 ? " (" + std::to_string(tolerated.count) + " times)" : "";
         console.Say("cimdelta: " + tolerated.document + ":" + std::to_string(tolerated.line) + ": tolerated: " + tolerated.text +
-                    times);
+                    CountTolerated(tolerated));
     }
 }
 

@@ -136,7 +136,9 @@ void TClassMaker::AddQualifiers(TElement& element, const TQualifiers& qualifiers
         if (IsInherited(qualifier, inherited)) {
             continue;
         }
-        NoteQualifier(qualifier, inherited != nullptr ? inherited->Find(qualifier.name).get() : nullptr);
+        if (!fIsKnown) {
+            NoteQualifier(qualifier, inherited != nullptr ? inherited->Find(qualifier.name).get() : nullptr);
+        }
         element.AddQualifier(boost::make_shared<TInMemQualifier>(qualifier.name, qualifier.value, qualifier.flavor));
     }
 }

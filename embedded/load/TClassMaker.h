@@ -18,8 +18,9 @@ namespace NORVZEL20 {
 /// would exceed TSchemaLimits, with kTypeMismatch (13) if a property has another type than in a superclass.
 class TClassMaker {
   public:
-    /// `ns` is what the class is for. Both arguments must outlive the maker.
-    TClassMaker(TLoadContext& context, TInMemNamespace& ns) : fContext(context), fNamespace(ns) {}
+    /// `ns` is what the class is for. It and the context must outlive the maker. `isKnown` says that the class was loaded before,
+    /// as a part of the schema: what is tolerated in it is in the report of that load already.
+    TClassMaker(TLoadContext& context, TInMemNamespace& ns, bool isKnown) : fContext(context), fNamespace(ns), fIsKnown(isKnown) {}
 
     /// A class that is not added to the namespace yet; `super` is null for a top-level class.
     boost::shared_ptr<TInMemClass> Make(const TDraft& draft, const boost::shared_ptr<TInMemClass>& super);
@@ -39,6 +40,7 @@ class TClassMaker {
 
     TLoadContext& fContext;
     TInMemNamespace& fNamespace;
+    bool fIsKnown;
 };
 
 }  // namespace NORVZEL20

@@ -48,7 +48,7 @@ void TClassQueue::Add(TDraft draft)
         return fContext.Tolerate("known class", "class " + Quote(name) + " is in the namespace already, declared the same");
     }
     fNumbers.emplace(name, fEntries.size());
-    fEntries.push_back({std::move(draft), kNew});
+    fEntries.push_back({std::move(draft), kNew, false});
     ++fContext.GetReport().classes;
 }
 
@@ -113,7 +113,7 @@ bool TClassQueue::TakeFromSchema(const std::string& name)
     TDraft draft{TStoredObjects::FromClass(*cls), fContext.GetPlace(), {}, {}};
     draft.propertyPlaces.assign(draft.object.GetProperties().size(), draft.place);
     fNumbers.emplace(draft.object.GetClassName(), fEntries.size());
-    fEntries.push_back({std::move(draft), kStuck});
+    fEntries.push_back({std::move(draft), kStuck, true});
     ++fContext.GetReport().classes;
     return true;
 }
@@ -188,7 +188,7 @@ void TClassQueue::Declare(std::size_t number)
         }
         const TLoadContext::TAt at(fContext, entry.draft.place);
         fContext.Guard([&] {
-            super = TClassMaker(fContext, fNamespace).Make(entry.draft, super);
+            super = TClassMaker(fContext, fNamespace, entry.isOfSchema).Make(entry.draft, super);
             fStaging.AddClass(super);
         });
         entry.state = kDeclared;

@@ -60,6 +60,7 @@ class CIMDELTA_INTERNAL_EXPORT TClassQueue {
     struct TEntry {
         TDraft draft;
         EState state;
+        bool isOfSchema;  ///< whether it was taken from there
     };
 
     void NoteRepeated(const std::string& name);

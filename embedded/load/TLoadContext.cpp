@@ -123,12 +123,14 @@ void TLoadContext::Tolerate(const char* kind, const std::string& text)
     // Kinds are string literals, one for each caller, so comparing pointers is enough.
     const auto known = std::find(fKinds.begin(), fKinds.end(), kind);
     if (known != fKinds.end()) {
-        ++fReport.tolerated[static_cast<std::size_t>(known - fKinds.begin())].count;
+        TLoadReport::TTolerated& first = fReport.tolerated[static_cast<std::size_t>(known - fKinds.begin())];
+        ++first.count;
+        first.others += text != first.text ? 1 : 0;
         return;
     }
     fKinds.push_back(kind);
     const TLoadPlace place = GetPlace();
-    fReport.tolerated.push_back({text, NameOf(place), place.place.line, 1});
+    fReport.tolerated.push_back({text, NameOf(place), place.place.line, 1, 0});
 }
 
 void TLoadContext::NoteNamespace(const std::string& name, const std::string& host)

@@ -16,6 +16,7 @@ struct TLoadReport {
         std::string document;  ///< what messages call the document of the first one
         std::size_t line;      ///< the line of the first one, from 1
         std::size_t count;     ///< how many of this kind there were
+        std::size_t others;    ///< how many of these have another text, because they are about other names
     };
 
     /// What the namespace was taken from.

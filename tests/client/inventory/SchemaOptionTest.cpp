@@ -80,6 +80,23 @@ TEST_F(SchemaOptionTest, TheFilesOfASchemaAreCheckedLikeOthers)
     EXPECT_EQ("[0]\nDisk: 2 instances\n--\n", Shell("show " + fA + " --schema -", "cat " + fSchema + " | "));
 }
 
+TEST_F(SchemaOptionTest, WhatIsToleratedInASchemaIsSaidOnce)
+{
+    const auto key = [](const std::string& name) {
+        return "<PROPERTY NAME=\"" + name +
+               "\" TYPE=\"string\"><QUALIFIER NAME=\"Key\" TYPE=\"boolean\"><VALUE>TRUE</VALUE>"
+               "</QUALIFIER></PROPERTY>";
+    };
+    const std::string size = "<PROPERTY NAME=\"Size\" TYPE=\"uint64\"><QUALIFIER NAME=\"Units\" TYPE=\"string\"/></PROPERTY>";
+    const std::string schema = Write("plain.xml", "<CLASS NAME=\"Disk\">\n" + key("Id") + size + "</CLASS><CLASS NAME=\"Two\">" +
+                                                      key("A") + key("B") + "</CLASS>");
+    Run({"compare", fA, fB, "--schema", schema, "--allow-empty"});
+    EXPECT_EQ(
+        "cimdelta: F/plain.xml:2: tolerated: qualifier \"Key\" is not declared; taken as it is written (3 times, 1 more of this "
+        "kind)\n",
+        Name(fErr));
+}
+
 TEST_F(SchemaOptionTest, ClassesAreInferred)
 {
     Run({"compare", "--detail", fA, fB, "--infer-classes", "--allow-empty"});

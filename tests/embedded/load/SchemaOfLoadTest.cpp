@@ -54,6 +54,21 @@ TEST_F(SchemaOfLoadTest, ClassesThatAreNeededAreDeclared)
     EXPECT_TRUE(fLoading.fNamespace->FindQualifierDecl("Key"));
 }
 
+TEST_F(SchemaOfLoadTest, WhatIsOddInItIsNotSaidAgain)
+{
+    const std::string odd = "<CLASS NAME=\"Fan\"><QUALIFIER NAME=\"Odd\" TYPE=\"boolean\"/><PROPERTY NAME=\"Id\" TYPE=\"string\">"
+                            "<QUALIFIER NAME=\"Key\" TYPE=\"boolean\"><VALUE>TRUE</VALUE></QUALIFIER></PROPERTY></CLASS>";
+    TOptionLoading schema;
+    EXPECT_EQ("", schema.Load({odd}));
+    ASSERT_EQ(1u, schema.fReport.tolerated.size());
+    EXPECT_EQ(2u, schema.fReport.tolerated.front().count);
+    EXPECT_EQ(1u, schema.fReport.tolerated.front().others);
+    fLoading.fOptions.schema = schema.fNamespace;
+    EXPECT_EQ("", fLoading.Load({O::Document(Instance("Fan", "1"))}));
+    EXPECT_EQ("Fan Odd\n  Id string Key\n", fLoading.Declaration("Fan"));
+    EXPECT_TRUE(fLoading.fReport.tolerated.empty());
+}
+
 TEST_F(SchemaOfLoadTest, WhatTheDocumentsDeclareGoesFirst)
 {
     EXPECT_EQ("", fLoading.Load({O::Document(Instance("Disk", "sda")), O::Document(Class("Disk", "Element", "Speed", "uint32"))}));
