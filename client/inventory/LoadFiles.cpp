@@ -13,14 +13,20 @@ namespace NORVZEL20 {
 
 namespace {
 
-// How the options of the command line do what the error advises; follows its message.
-std::string NameOptions(EAdvice advice, const TLoadingOptions& options)
+// How to give a declaration; `options` may have given some already.
+std::string NameSchemaOption(const TLoadingOptions& options)
 {
-    switch (advice) {
+    return " with " + std::string(options.schemas.empty() ? "" : "another ") + options.schemaOption + " FILE";
+}
+
+// What a user of the client can do about the error; follows its message.
+std::string DescribeAdvice(const TPopulateError& error, const TLoadingOptions& options)
+{
+    switch (error.GetAdvice()) {
     case EAdvice::kGiveDeclaration:
-        return " with " + options.schemaOption + " FILE";
+        return NameSchemaOption(options);
     case EAdvice::kGiveOrInferDeclaration:
-        return " with " + options.schemaOption + " FILE, or let --infer-classes find it";
+        return NameSchemaOption(options) + ", or let --infer-classes find it";
     case EAdvice::kLetBadValuesPass:
         return " with --bad-values null or --bad-values text";
     case EAdvice::kKeepBadValuesAsText:
@@ -42,17 +48,7 @@ TLoadReport LoadFiles(const TFilesToLoad& files, const TLoadOptions& load, const
         }
         return session.Commit();
     } catch (const TPopulateError& error) {
-// How often it was tolerated; follows its text. Empty for once.
-std::string CountTolerated(const TLoadReport::TTolerated& tolerated)
-{
-    const std::size_t same = tolerated.count - tolerated.others;
-    const std::string times = same > 1 ? std::to_string(same) + " times" : "";
-    const std::string others = tolerated.others > 0 ? std::to_string(tolerated.others) + " more of this kind" : "";
-    const std::string all = times + (times.empty() || others.empty() ? "" : ", ") + others;
-    return all.empty() ? "" : " (" + all + ")";
-}
-
-        throw TClientError(error.what() + NameOptions(error.GetAdvice(), options));
+        throw TClientError(error.what() + DescribeAdvice(error, options));
     } catch (const TZELException& error) {
         ThrowIfOutOfMemory(error);
         throw TClientError(files.name + ": " + error.what());

@@ -51,7 +51,7 @@ TSuggestedCommand& TSuggestedCommand::AddFile(const std::string& path)
 
 TSuggestedCommand& TSuggestedCommand::AddInventory(const TInventory& inventory)
 {
-    return AddArgument(inventory).AddLoading(inventory.loading);
+    return AddArgument(inventory).AddLoading(inventory.loading, inventory.loading.schemaOption);
 }
 
 TSuggestedCommand& TSuggestedCommand::AddSchemas(const std::vector<TInventory>& inventories, bool strictSchema)
@@ -60,7 +60,7 @@ TSuggestedCommand& TSuggestedCommand::AddSchemas(const std::vector<TInventory>& 
         Add("--schema").AddArgument(inventory);
     }
     if (!inventories.empty()) {
-        AddLoading(inventories.front().loading);
+        AddLoading(inventories.front().loading, "--declarations");
     }
     return strictSchema ? Add("--strict-schema") : *this;
 }
@@ -71,7 +71,7 @@ TSuggestedCommand& TSuggestedCommand::AddArgument(const TInventory& inventory)
     return Add(inventory.path);
 }
 
-TSuggestedCommand& TSuggestedCommand::AddLoading(const TLoadingOptions& options)
+TSuggestedCommand& TSuggestedCommand::AddLoading(const TLoadingOptions& options, const std::string& schemaOption)
 {
     for (const std::string& name : options.namespaces) {
         Add("--namespace").Add(name);
@@ -80,7 +80,7 @@ TSuggestedCommand& TSuggestedCommand::AddLoading(const TLoadingOptions& options)
         Add("--bad-values").Add(options.badValues == EBadValues::kNull ? "null" : "text");
     }
     for (const std::string& list : options.schemas) {
-        Add("--declarations").Add(list);
+        Add(schemaOption).Add(list);
     }
     fCanBeRun = fCanBeRun && std::all_of(options.schemaFiles.begin(), options.schemaFiles.end(), &CanBeReadAgain);
     return options.infersClasses ? Add("--infer-classes") : *this;

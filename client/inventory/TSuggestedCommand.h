@@ -33,7 +33,7 @@ class TSuggestedCommand {
 
   private:
     TSuggestedCommand& AddArgument(const TInventory& inventory);
-    TSuggestedCommand& AddLoading(const TLoadingOptions& options);
+    TSuggestedCommand& AddLoading(const TLoadingOptions& options, const std::string& schemaOption);
 
     std::string fText;
     bool fCanBeRun = true;

@@ -15,7 +15,4 @@ std::string QuoteIfLong(const std::string& path);
 /// The message that an object (a "class" or an "instance") has a property twice.
 std::string DescribeSecondProperty(std::string_view property, const char* object);
 
-/// What follows the name of a class that is needed but not declared.
-inline constexpr char kIsNotDeclared[] = ", which is not declared; give its declaration";
-
 }  // namespace NORVZEL20

@@ -243,7 +243,7 @@ void TClassQueue::Refuse(const TDraft& draft) const
     if (fNumbers.count(superName) > 0) {
         fContext.Fail(EStatus::kNotFound, found + ", which leads back to it or to a class that is not declared");
     }
-    fContext.Fail(EStatus::kNotFound, found + kIsNotDeclared, EAdvice::kGiveDeclaration);
+    fContext.Fail(EStatus::kNotFound, found + fContext.DescribeUndeclared(), EAdvice::kGiveDeclaration);
 }
 
 std::vector<boost::shared_ptr<ICIMElement>> TClassQueue::GetClasses() const

@@ -201,8 +201,11 @@ void TInstanceBuilder::Fill(const TDraft& draft, const TReadObjects& readObjects
 {
     const TEmbeddedObject& object = draft.object;
     if (!Begin(object.GetClassName().c_str())) {
-        fContext.Fail(EStatus::kNotFound, "found an instance of class " + Quote(object.GetClassName()) + kIsNotDeclared,
-                      EAdvice::kGiveOrInferDeclaration);
+        // Keys are inferred from the names in front of instances.
+        const bool canBeInferred = !fContext.GetOptions().infersClasses && !draft.ownKeys.empty();
+        fContext.Fail(EStatus::kNotFound,
+                      "found an instance of class " + Quote(object.GetClassName()) + fContext.DescribeUndeclared(),
+                      canBeInferred ? EAdvice::kGiveOrInferDeclaration : EAdvice::kGiveDeclaration);
     }
     auto bad = draft.badValues.begin();  // in the order of the properties
     for (std::size_t index = 0; index < object.GetProperties().size(); ++index) {

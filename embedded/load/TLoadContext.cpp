@@ -63,6 +63,12 @@ void TLoadContext::Throw(TZELStatusCode::EStatusCode status, const std::string& 
     throw TPopulateError(status, message, NameOf(place), place.place.line, place.place.column, advice);
 }
 
+const char* TLoadContext::DescribeUndeclared() const noexcept
+{
+    return fOptions.schema ? ", which neither the documents nor the schema declare; give its declaration"
+                           : ", which is not declared; give its declaration";
+}
+
 void TLoadContext::NoteBadValue(const TBadValue& bad, const std::string& className, const std::string& property, bool isInInstance)
 {
     constexpr std::size_t kLongestText = 80;

@@ -65,6 +65,9 @@ class CIMDELTA_INTERNAL_EXPORT TLoadContext {
     /// before and are to be refused, the error is about the first of them instead.
     [[noreturn]] void Fail(TZELStatusCode::EStatusCode status, const std::string& message, EAdvice advice = EAdvice::kNone) const;
 
+    /// What follows the name of a class that is needed but not declared.
+    const char* DescribeUndeclared() const noexcept;
+
     /// Counts a value of a property of `className` that does not fit its type. `isInInstance`: see TBadValues::Note.
     void NoteBadValue(const TBadValue& bad, const std::string& className, const std::string& property, bool isInInstance);
     /// Fails with kTypeMismatch (13), since a key cannot be NULL.

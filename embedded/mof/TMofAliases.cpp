@@ -69,7 +69,7 @@ TCIMValue TMofAliases::MakeReference(const TMofInstance& instance)
     if (!cls) {
         fContext.Fail(EStatus::kNotFound,
                       "found the alias $" + instance.alias + " of an instance of class " + Quote(instance.className) +
-                          ", which is not declared; give its declaration",
+                          fContext.DescribeUndeclared(),
                       EAdvice::kGiveDeclaration);
     }
     TCIMReference path;

@@ -122,12 +122,33 @@ TEST_F(SchemaOptionTest, InferredClassesAreCompletedLikeOthers)
     EXPECT_NE(std::string::npos, fOut.find("Size: 1 -> NULL")) << fOut << fErr;
 }
 
+TEST_F(SchemaOptionTest, WhatTheSchemaLacksIsSaid)
+{
+    const std::string other = Write("other.xml", Document(System()));
+    const std::string found =
+        "cimdelta: F/a.xml:2:123: found an instance of class \"Disk\", which neither the documents nor the schema declare; give "
+        "its declaration with another ";
+    EXPECT_EQ(found + "--schema FILE, or let --infer-classes find it\n", Name(Complaint({"show", fA, "--schema", other})));
+    EXPECT_EQ(found + "--declarations FILE, or let --infer-classes find it\n",
+              Name(Complaint({"check", "rules.xml", "--schema", fA, "--declarations", other})));
+}
+
+TEST_F(SchemaOptionTest, OnlyWhatHelpsIsAdvised)
+{
+    const std::string found = "found an instance of class \"Disk\", which is not declared";
+    const std::string give = "; give its declaration with --schema FILE\n";
+    const std::string mof = Write("c.mof", "instance of Disk { Id = \"a\"; };");
+    EXPECT_EQ("cimdelta: F/c.mof:1:1: " + found + give, Name(Complaint({"show", mof})));
+    EXPECT_EQ("cimdelta: F/c.mof:1:1: " + found + give, Name(Complaint({"show", mof, "--infer-classes"})));
+    const std::string nameless = Write("d.xml", "<INSTANCE CLASSNAME=\"Disk\"/>");
+    EXPECT_EQ("cimdelta: F/d.xml:1:1: " + found + give, Name(Complaint({"show", nameless})));
+}
+
 TEST_F(SchemaOptionTest, SuggestedCommandsHaveTheOptions)
 {
-    EXPECT_EQ(
-        "cimdelta: F/a.xml: declares no class Disc; cimdelta show F/a.xml --declarations F/schema.xml --infer-classes lists those "
-        "it declares\n",
-        Name(Complaint({"show", fA, "Disc", "--schema", fSchema, "--infer-classes"})));
+    EXPECT_EQ("cimdelta: F/a.xml: declares no class Disc; cimdelta show F/a.xml --schema F/schema.xml --infer-classes lists those "
+              "it declares\n",
+              Name(Complaint({"show", fA, "Disc", "--schema", fSchema, "--infer-classes"})));
 }
 
 }  // namespace

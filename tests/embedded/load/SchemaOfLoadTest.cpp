@@ -98,11 +98,13 @@ TEST_F(SchemaOfLoadTest, ClassesOfReferencesAreDeclaredToo)
 TEST_F(SchemaOfLoadTest, WhatItLacksIsRefused)
 {
     const std::string message = fLoading.Load({O::Document(Instance("Disk", "sda") + Instance("Disc", "sdb"))});
-    EXPECT_NE(std::string::npos, message.find("found an instance of class \"Disc\", which is not declared; give its declaration"))
+    EXPECT_NE(std::string::npos,
+              message.find("found an instance of class \"Disc\", which neither the documents nor the schema declare"))
         << message;
     EXPECT_EQ("", fLoading.Declaration("Disk"));
     const std::string super = fLoading.Load({O::Document(Class("Drive", "Disc", "Model", "string"))});
-    EXPECT_NE(std::string::npos, super.find("with the superclass \"Disc\", which is not declared; give its declaration")) << super;
+    EXPECT_NE(std::string::npos, super.find("with the superclass \"Disc\", which neither the documents nor the schema declare"))
+        << super;
     EXPECT_TRUE(EAdvice::kGiveDeclaration == fLoading.fAdvice);
 }
 
