@@ -196,8 +196,9 @@ void TLoader::DropRepeated()
     fRepeats.Check();
     fContext.GetReport().instances -= fRepeats.GetCount();
     if (fRepeats.GetCount() > 0 && fKeep) {
-        const auto isRepeated = [this](const boost::shared_ptr<ICIMElement>& kept) {
-            return fRepeats.Has(static_cast<const TInMemInstance&>(*kept));
+        const std::unordered_set<const TInMemInstance*> repeated = fRepeats.GetRepeated();
+        const auto isRepeated = [&repeated](const boost::shared_ptr<ICIMElement>& kept) {
+            return repeated.count(static_cast<const TInMemInstance*>(kept.get())) > 0;
         };
         fKeptInstances.erase(std::remove_if(fKeptInstances.begin(), fKeptInstances.end(), isRepeated), fKeptInstances.end());
     }

@@ -1,6 +1,5 @@
 #include "embedded/load/TRepeatedInstances.h"
 
-#include <algorithm>
 #include <string>
 
 #include "embedded/load/MessageText.h"
@@ -18,18 +17,14 @@ std::string ShowPath(const TInMemInstance& instance)
     return QuoteIfLong(instance.GetReference().ToText());
 }
 
-boost::shared_ptr<TInMemInstance> FindFirst(const TInMemInstance& repeated)
+/// The position in the extent of the class; kNoPosition if it is not there.
+std::uint32_t FindFirst(const TInMemInstance& repeated)
 {
     std::vector<TCIMValue> keys;
     for (const std::uint32_t slot : repeated.GetInMemClass()->GetLayout().GetKeys()) {
         keys.push_back(repeated.GetSlotValue(slot));
     }
-    return repeated.GetInMemClass()->GetExtent().Find(keys);
-}
-
-bool AreEqual(const TCIMValue& a, const TCIMValue& b)
-{
-    return a.IsNull() || b.IsNull() ? a.IsNull() && b.IsNull() : a == b;
+    return repeated.GetInMemClass()->GetExtent().FindPosition(keys);
 }
 
 /// The first property in which they differ; null if they are equal. Static properties have the same value anyway.
@@ -37,7 +32,7 @@ const TInMemPropertyDecl* FindDifference(const TInMemInstance& a, const TInMemIn
 {
     const TInMemLayout& layout = a.GetInMemClass()->GetLayout();
     for (const std::uint32_t slot : layout.GetOrder()) {
-        if (!layout.GetDecl(slot).IsStatic() && !AreEqual(a.GetSlotValue(slot), b.GetSlotValue(slot))) {
+        if (!layout.GetDecl(slot).IsStatic() && a.GetSlotValue(slot) != b.GetSlotValue(slot)) {
             return &layout.GetDecl(slot);
         }
     }
@@ -59,28 +54,22 @@ void TRepeatedInstances::NoteAdded(const TInMemClass& cls, const TLoadPlace& pla
         fLast = &fPlaces[&cls];
     }
     if (fLast->places.empty()) {
-        fLast->before = cls.GetExtent().GetCount() - 1;
+        fLast->before = cls.GetExtent().GetMark().size - 1;
     }
     fLast->places.push_back({static_cast<std::uint32_t>(place.document), static_cast<std::uint32_t>(place.place.line),
                              static_cast<std::uint32_t>(place.place.column)});
 }
 
-std::optional<TLoadPlace> TRepeatedInstances::FindPlace(const TInMemInstance& instance) const
+/// Null if the load has not added what stands there. Nothing is removed during a load, so the positions of what it adds follow one
+/// another.
+const TRepeatedInstances::TPlace* TRepeatedInstances::FindPlace(const TInMemClass& cls, std::uint32_t position) const
 {
-    const auto known = fPlaces.find(instance.GetInMemClass().get());
-    if (known == fPlaces.end()) {
-        return std::nullopt;
+    const auto known = fPlaces.find(&cls);
+    if (known == fPlaces.end() || position < known->second.before ||
+        position - known->second.before >= known->second.places.size()) {
+        return nullptr;
     }
-    std::size_t position = 0;
-    instance.GetInMemClass()->GetExtent().Enumerate([&](const boost::shared_ptr<ICIMInstance>& next) {
-        position += next.get() != &instance ? 1 : 0;
-        return next.get() != &instance;
-    });
-    if (position < known->second.before || position - known->second.before >= known->second.places.size()) {
-        return std::nullopt;
-    }
-    const TPlace& place = known->second.places[position - known->second.before];
-    return TLoadPlace{place.document, {place.line, place.column}};
+    return &known->second.places[position - known->second.before];
 }
 
 void TRepeatedInstances::NoteRepeated(const boost::shared_ptr<TInMemInstance>& repeated)
@@ -91,12 +80,14 @@ void TRepeatedInstances::NoteRepeated(const boost::shared_ptr<TInMemInstance>& r
                                                    ", which has no key to tell them apart; give its whole declaration, with the"
                                                    " qualifiers and those of its superclasses");
     }
-    const boost::shared_ptr<TInMemInstance> first = FindFirst(*repeated);
-    if (!first || !FindPlace(*first)) {
+    const std::uint32_t first = FindFirst(*repeated);
+    const TPlace* const place = FindPlace(cls, first);
+    if (place == nullptr) {
         fContext.Fail(EStatus::kAlreadyExists, "found a second instance " + ShowPath(*repeated) + "; instances of class " +
                                                    Quote(cls.GetName()) + " must differ in their keys");
     }
-    fRepeats.push_back({first, repeated, fContext.GetPlace()});
+    const TLoadPlace firstPlace = {place->document, {place->line, place->column}};
+    fRepeats.push_back({cls.GetExtent().GetAt(first), firstPlace, repeated, fContext.GetPlace()});
 }
 
 void TRepeatedInstances::Check()
@@ -113,15 +104,19 @@ void TRepeatedInstances::Compare(const TRepeat& repeat)
     if (const TInMemPropertyDecl* const decl = FindDifference(*repeat.first, *repeat.repeated)) {
         fContext.Fail(EStatus::kAlreadyExists, "found a second instance " + path + " with " + ShowValue(*repeat.repeated, *decl) +
                                                    " in property " + Quote(decl->GetName()) + ", but the one at " +
-                                                   fContext.Describe(*FindPlace(*repeat.first)) + " has " +
+                                                   fContext.Describe(repeat.firstPlace) + " has " +
                                                    ShowValue(*repeat.first, *decl) + "; remove one of the two");
     }
     fContext.Tolerate("repeated instance", "instance " + path + " is there again with the same values; taken as one");
 }
 
-bool TRepeatedInstances::Has(const TInMemInstance& instance) const noexcept
+std::unordered_set<const TInMemInstance*> TRepeatedInstances::GetRepeated() const
 {
-    return std::any_of(fRepeats.begin(), fRepeats.end(), [&](const TRepeat& repeat) { return repeat.repeated.get() == &instance; });
+    std::unordered_set<const TInMemInstance*> repeated;
+    for (const TRepeat& repeat : fRepeats) {
+        repeated.insert(repeat.repeated.get());
+    }
+    return repeated;
 }
 
 }  // namespace NORVZEL20

@@ -2,8 +2,8 @@
 
 #include <boost/smart_ptr/shared_ptr.hpp>
 #include <cstdint>
-#include <optional>
 #include <unordered_map>
+#include <unordered_set>
 #include <vector>
 
 #include "embedded/load/TLoadContext.h"
@@ -14,7 +14,8 @@ namespace NORVZEL20 {
 /// Instances that a load has twice. If both have the same values, they are one, which is tolerated; otherwise they contradict each
 /// other. Values are compared at the end, because references may be written again until then.
 ///
-/// Memory: 12 bytes for each instance of the load. Cost: constant for each operation but Check and what fails.
+/// Memory: 12 bytes for each instance of the load. Cost: constant for each operation but Check and GetRepeated, which are linear in
+/// what was noted.
 class TRepeatedInstances {
   public:
     explicit TRepeatedInstances(TLoadContext& context) noexcept : fContext(context) {}
@@ -27,9 +28,9 @@ class TRepeatedInstances {
     /// Compares what was noted. Errors: fails with kAlreadyExists (12) if one has other values than the instance added first.
     void Check();
 
-    /// Those that were noted, in the order of the documents.
-    bool Has(const TInMemInstance& instance) const noexcept;
     std::size_t GetCount() const noexcept { return fRepeats.size(); }
+    /// The instances that were noted.
+    std::unordered_set<const TInMemInstance*> GetRepeated() const;
 
   private:
     struct TPlace {
@@ -38,16 +39,17 @@ class TRepeatedInstances {
         std::uint32_t column;
     };
     struct TPlaces {
-        std::size_t before = 0;  // instances in the extent, from earlier loads
+        std::uint32_t before = 0;  // positions in the extent, from earlier loads
         std::vector<TPlace> places;
     };
     struct TRepeat {
         boost::shared_ptr<TInMemInstance> first;
+        TLoadPlace firstPlace;
         boost::shared_ptr<TInMemInstance> repeated;
         TLoadPlace place;
     };
 
-    std::optional<TLoadPlace> FindPlace(const TInMemInstance& instance) const;
+    const TPlace* FindPlace(const TInMemClass& cls, std::uint32_t position) const;
     void Compare(const TRepeat& repeat);
 
     TLoadContext& fContext;

@@ -151,6 +151,12 @@ bool TInMemExtent::HasSameKeys(const TInMemInstance& a, const TInMemInstance& b)
 
 boost::shared_ptr<TInMemInstance> TInMemExtent::Find(const std::vector<TCIMValue>& keys) const
 {
+    const std::uint32_t position = FindPosition(keys);
+    return position == kNoPosition ? nullptr : fInstances[position];
+}
+
+std::uint32_t TInMemExtent::FindPosition(const std::vector<TCIMValue>& keys) const
+{
     Refresh();
     std::uint32_t hash = 0;
     for (const TCIMValue& key : keys) {
@@ -165,8 +171,7 @@ boost::shared_ptr<TInMemInstance> TInMemExtent::Find(const std::vector<TCIMValue
         }
         return true;
     };
-    const std::uint32_t found = fIndex.Find(hash, isSame);
-    return found == THashIndex::kNone ? nullptr : fInstances[found];
+    return fIndex.Find(hash, isSame);
 }
 
 bool TInMemExtent::Remove(const TInMemInstance& instance)

@@ -17,6 +17,8 @@ namespace NORVZEL20 {
 /// Threads: as the namespace.
 class TInMemExtent {
   public:
+    static constexpr std::uint32_t kNoPosition = THashIndex::kNone;
+
     /// A moment in the life of the extent, to which RollBack returns.
     struct TMark {
         std::uint32_t size;
@@ -40,6 +42,11 @@ class TInMemExtent {
     void Check(const TInMemInstance& instance) const;
     /// The instance with these keys (in the order of the class's keys, in their declared types), or null.
     boost::shared_ptr<TInMemInstance> Find(const std::vector<TCIMValue>& keys) const;
+    /// Where the instance with these keys stands in the order of insertion, gaps of removed ones included; kNoPosition if it is not
+    /// there. Positions change only if instances are removed.
+    std::uint32_t FindPosition(const std::vector<TCIMValue>& keys) const;
+    /// `position` must be one that FindPosition has returned.
+    const boost::shared_ptr<TInMemInstance>& GetAt(std::uint32_t position) const noexcept { return fInstances[position]; }
     /// False if it is not there.
     bool Remove(const TInMemInstance& instance);
     void Clear() noexcept;

@@ -105,6 +105,19 @@ TEST_F(RepeatsTest, WhatTheNamespaceHadBeforeIsNoRepetition)
               loading.ErrorOf(L::Group(Disk("b", "1") + Disk("b", "2"))));
 }
 
+TEST_F(RepeatsTest, TheFirstPlaceIsFoundBehindInstancesThatAreGone)
+{
+    TLoading loading;
+    loading.Load(L::Group(fDisk + Disk("a", "1") + Disk("b", "1") + Disk("c", "1")));
+    loading.GetNamespace()->DeleteInstance(TCIMReference::Parse("Disk.Id=\"b\""), TCallContext());
+    EXPECT_EQ("doc.xml:4:166: found a second instance root/cimv2:Disk.Id=\"b\" with \"3\" in property \"Size\", but the one at"
+              " doc.xml:3:166 has \"2\"; remove one of the two",
+              loading.ErrorOf(L::Group(Disk("d", "2") + Disk("b", "2") + Disk("b", "3"))));
+    EXPECT_EQ("doc.xml:3:166: found a second instance root/cimv2:Disk.Id=\"c\"; instances of class \"Disk\" must differ in their"
+              " keys",
+              loading.ErrorOf(L::Group(Disk("b", "2") + Disk("c", "1"))));
+}
+
 /// A server may be asked for what a class declares, or for all that it has. Which answer comes first does not matter.
 TEST_F(RepeatsTest, AClassIsTheSameWithAndWithoutWhatItInherits)
 {
