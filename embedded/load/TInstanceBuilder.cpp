@@ -6,12 +6,11 @@
 // is kept in the class's layout, as the number of the last instance that had it, so nothing is cleared between instances.
 #include "embedded/load/TInstanceBuilder.h"
 
+#include "embedded/load/DropPlaces.h"
 #include "embedded/load/MessageText.h"
 #include "embedded/store/TReferenceAdapter.h"
-#include "embedded/value/ChangeReferences.h"
 #include "embedded/value/TValueAccess.h"
 #include "embedded/value/TValueText.h"
-#include "host/TCIMReference.h"
 
 namespace NORVZEL20 {
 
@@ -24,27 +23,6 @@ constexpr std::uint32_t kFewInstances = 8;
 std::string Show(const TCIMValue& value)
 {
     return value.IsNull() ? "NULL" : Quote(value.ToText());
-}
-
-/// Takes namespace and host out of a reference, and of those in its keys.
-void DropPlaces(TCIMValue& value)
-{
-    ChangeReferences(value, [](TCIMValue& reference) {
-        TCIMReference path = reference;
-        std::vector<std::pair<std::string, TCIMValue>> keys;
-        path.EnumerateKeyBindings([&keys](const std::pair<std::string, TCIMValue>& key) {
-            keys.push_back(key);
-            return true;
-        });
-        for (auto& [name, key] : keys) {
-            DropPlaces(key);
-            path.AddKeyValue(name, key);
-        }
-        path.SetNamespaceName(std::string());
-        path.SetHost(std::string());
-        reference = TCIMValue(path);
-        return true;
-    });
 }
 
 /// A string, or an array of strings and nulls.

@@ -10,7 +10,9 @@
 #include "embedded/load/TLateInstances.h"
 
 #include <algorithm>
+#include <unordered_set>
 
+#include "embedded/load/DropPlaces.h"
 #include "embedded/store/TReferenceAdapter.h"
 #include "embedded/value/ChangeReferences.h"
 #include "host/TCIMReference.h"
@@ -33,12 +35,8 @@ void VisitClasses(TCIMValue value, const boost::function<void(const std::string&
     });
 }
 
-// Whether the path names a namespace, and leads to an instance of `ns` without it.
-bool IsNamedInstance(const TInMemNamespace& ns, const TCIMReference& path)
+bool HasInstance(const TInMemNamespace& ns, const TCIMReference& path)
 {
-    if (path.GetNamespaceName().empty()) {
-        return false;
-    }
     TCIMReference local(path);
     local.SetNamespaceName("");
     local.SetHost("");
@@ -47,6 +45,26 @@ bool IsNamedInstance(const TInMemNamespace& ns, const TCIMReference& path)
     } catch (const TZELException&) {
         return false;  // its keys are not those of the class, so it leads nowhere here
     }
+}
+
+struct TPathHash {
+    std::size_t operator()(const TCIMValue& path) const { return static_cast<std::size_t>(path.KeyHash()); }
+};
+struct TSamePath {
+    bool operator()(const TCIMValue& a, const TCIMValue& b) const { return a.IsSameKey(b); }
+};
+using TPaths = std::unordered_set<TCIMValue, TPathHash, TSamePath>;
+
+// The references in their keys may be open, so they are compared without places.
+TPaths LocalPathsOf(const std::vector<TLateInstances::THeld>& held)
+{
+    TPaths paths;
+    for (const TLateInstances::THeld& one : held) {
+        TCIMValue path(one.instance->GetReference());
+        DropPlaces(path);
+        paths.insert(std::move(path));
+    }
+    return paths;
 }
 
 }  // namespace
@@ -84,11 +102,17 @@ void TLateInstances::AdaptReferences(TOwnPlaceSearch& place, const TInMemNamespa
 
 bool TLateInstances::LeadTo(const TInMemNamespace& ns) const
 {
-    return std::any_of(fReferences.begin(), fReferences.end(), [&ns](const auto& noted) {
+    const TPaths held = LocalPathsOf(fHeld);
+    const auto leads = [&](const TCIMReference& path) {
+        TCIMValue local(path);
+        DropPlaces(local);
+        return !path.GetNamespaceName().empty() && (HasInstance(ns, path) || held.count(local) > 0);
+    };
+    return std::any_of(fReferences.begin(), fReferences.end(), [&leads](const auto& noted) {
         TCIMValue value = noted.first->GetSlotValue(noted.second);
         bool isFound = false;
         ChangeReferences(value, [&](TCIMValue& reference) {
-            isFound = isFound || IsNamedInstance(ns, reference);
+            isFound = isFound || leads(reference);
             return false;
         });
         return isFound;

@@ -46,7 +46,8 @@ class TLateInstances {
     /// Writes the noted references again, with the keys as their classes declare them. `declared` is how many classes are declared
     /// by now. Call it before `place` decides, so that it sees references that were text.
     void AdaptReferences(TOwnPlaceSearch& place, const TInMemNamespace& ns, std::size_t declared);
-    /// Whether any noted reference leads to an instance of `ns`, once its namespace and host are left out.
+    /// Whether any noted reference leads to an instance of `ns` or to one that is held, once namespaces and hosts are left out.
+    /// Linear in what is held and noted.
     bool LeadTo(const TInMemNamespace& ns) const;
     /// Takes the document's own namespace out of the noted references. Call it after `place` has decided, and before TakeHeld.
     void MakeReferencesLocal(TOwnPlaceSearch& place);

@@ -250,6 +250,24 @@ TEST_F(OwnPlaceTest, IfSomeNameNoneANamespaceIsTheOwnOneThatLeadsToAnInstance)
     EXPECT_EQ("root/hw", fReport.namespaceName);
 }
 
+/// Such instances are added only after it is decided. The same holds for those whose own name is open.
+TEST_F(OwnPlaceTest, TheInstanceThatANamespaceLeadsToMayComeBeforeItsClass)
+{
+    const std::string instances = Pointing("1", "", "hw") + Nameless("2") + L::Instance("C", "z");
+    EXPECT_EQ((TTexts{fLocal, fLocal}), Stored(instances + Classes(), 2));
+    EXPECT_EQ("root/hw", fReport.namespaceName);
+    fLoading = TLoading();
+    EXPECT_EQ((TTexts{"root/hw:C.Id=\"z\"", fLocal}), Stored(Pointing("1", "", "hw") + Nameless("2") + Classes(), 2));
+    EXPECT_EQ("root/cimv2", fReport.namespaceName);
+
+    const std::string link = "<VALUE.REFERENCE><LOCALINSTANCEPATH>" + Place("", "hw") +
+                             "<INSTANCENAME CLASSNAME=\"Link\"><KEYBINDING NAME=\"R\">" + Path("", "hw") +
+                             "</KEYBINDING></INSTANCENAME></LOCALINSTANCEPATH></VALUE.REFERENCE>";
+    const std::string toLink = L::Instance("C", "1", "<PROPERTY.REFERENCE NAME=\"R\">" + link + "</PROPERTY.REFERENCE>");
+    fLoading = TLoading();
+    EXPECT_EQ((TTexts{"Link.R=\"C.Id=\\\"z\\\"\""}), Stored(Classes() + toLink + Link(Reference("", "hw")) + Nameless("2"), 1));
+}
+
 TEST_F(OwnPlaceTest, WithoutReferencesNothingIsKnownOfTheNamespace)
 {
     Load(Classes() + L::Instance("C", "1"));
