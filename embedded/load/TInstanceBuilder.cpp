@@ -6,9 +6,12 @@
 // is kept in the class's layout, as the number of the last instance that had it, so nothing is cleared between instances.
 #include "embedded/load/TInstanceBuilder.h"
 
+#include <algorithm>
+
 #include "embedded/load/DropPlaces.h"
 #include "embedded/load/MessageText.h"
 #include "embedded/store/TReferenceAdapter.h"
+#include "embedded/value/TNameText.h"
 #include "embedded/value/TValueAccess.h"
 #include "embedded/value/TValueText.h"
 
@@ -248,8 +251,9 @@ boost::shared_ptr<TInMemInstance> TInstanceBuilder::Take(const TOwnKeys* ownKeys
 /// Compares the instance with the name in front of it, and takes keys from there that it leaves out.
 void TInstanceBuilder::UseKeys(const TOwnKeys& keys)
 {
+    CheckKeyCount(keys);
     for (const auto& [name, value] : keys) {
-        const std::uint32_t slot = fLayout->cls->GetLayout().FindSlot(name);
+        const std::uint32_t slot = FindKey(name);
         if (slot == TInMemLayout::kNoSlot || fLayout->targets[slot].isStatic) {
             continue;
         }
@@ -260,6 +264,38 @@ void TInstanceBuilder::UseKeys(const TOwnKeys& keys)
             FillKey(target, value);
         }
     }
+}
+
+/// A name with no keys at all says nothing of them.
+void TInstanceBuilder::CheckKeyCount(const TOwnKeys& keys) const
+{
+    const TInMemLayout& layout = fLayout->cls->GetLayout();
+    if (keys.empty() || keys.size() >= layout.GetKeys().size()) {
+        return;
+    }
+    for (const std::uint32_t slot : layout.GetKeys()) {
+        const std::string& key = layout.GetDecl(slot).GetName();
+        if (std::none_of(keys.begin(), keys.end(), [&key](const auto& given) { return TNameText::Equal(given.first, key); })) {
+            fContext.Fail(EStatus::kParseError, "found no value for the key " + Quote(key) +
+                                                    " in the name in front of an instance of class " +
+                                                    Quote(fLayout->cls->GetName()) + "; give it there too, or leave the name out");
+        }
+    }
+}
+
+/// The slot of a key that a name gives. A class without keys may lack the qualifiers that make keys; then names may give any.
+std::uint32_t TInstanceBuilder::FindKey(const std::string& name) const
+{
+    const TInMemLayout& layout = fLayout->cls->GetLayout();
+    const std::vector<std::uint32_t>& keys = layout.GetKeys();
+    const std::uint32_t slot = name.empty() && keys.size() == 1 ? keys.front() : layout.FindSlot(name);
+    const bool isKey = slot != TInMemLayout::kNoSlot && layout.GetDecl(slot).IsKey();
+    if (!isKey && !keys.empty()) {
+        fContext.Fail(EStatus::kParseError, "found the key " + Quote(name) + " in the name in front of an instance of class " +
+                                                Quote(fLayout->cls->GetName()) +
+                                                ", which has no such key; remove it there, or correct the declaration");
+    }
+    return slot;
 }
 
 void TInstanceBuilder::FillKey(const TLoadTarget& target, const TCIMValue& value)

@@ -61,7 +61,8 @@ class TInstanceBuilder {
     /// its class is not declared; those of FindProperty and SetProperty.
     void Fill(const TDraft& draft, const TReadObjects& readObjects);
     /// Ends the instance. `ownKeys` (may be null) are the keys of the name in front of it, for those that it leaves out. Errors:
-    /// kParseError (9) if the instance has another value there.
+    /// kParseError (9) if the instance has another value there, or if they are not the keys of the class; none at all, or a class
+    /// without keys, is no error.
     boost::shared_ptr<TInMemInstance> Take(const TOwnKeys* ownKeys);
 
     /// Whether the instances of the last instance's class are held; see TLateInstances::Hold.
@@ -85,6 +86,8 @@ class TInstanceBuilder {
     bool Localize(TCIMValue& value) const;
     void FillDefaults();
     void UseKeys(const TOwnKeys& keys);
+    void CheckKeyCount(const TOwnKeys& keys) const;
+    std::uint32_t FindKey(const std::string& name) const;
     void FillKey(const TLoadTarget& target, const TCIMValue& value);
     void CheckKey(const TLoadTarget& target, const TCIMValue& value);
 

@@ -51,7 +51,7 @@ class CIMDELTA_INTERNAL_EXPORT TLoader {
     void SetBad(const TLoadTarget& target, const TBadValue& bad) { fBuilder.SetBad(target, bad); }
     /// `ownKeys` (may be null) gives the keys of the name in front of the instance; it may leave them out itself. Errors:
     /// kAlreadyExists (12) if an instance with these keys was there before the load, kKeyMissing (14) if a key has no value,
-    /// kParseError (9) if a key has another value than the name says.
+    /// kParseError (9) if the name has other keys than the class, or other values than the instance.
     void EndInstance(const TOwnKeys* ownKeys);
     void AddInstance(TDraft draft);
     /// As AddInstance, but does not let the instance wait if no other does. Call it after DeclareClasses. Errors: as Finish.

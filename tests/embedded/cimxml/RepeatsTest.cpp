@@ -208,5 +208,57 @@ TEST_F(RepeatsTest, AKeyInTheNameThatContradictsTheInstanceIsRefused)
     }
 }
 
+/// The names of the keys in the name, and what is wrong.
+TEST_F(RepeatsTest, ANameWithOtherKeysThanItsClassIsRefused)
+{
+    const std::string behind = " in the name in front of an instance of class \"Port\"";
+    const struct {
+        std::vector<std::string> names;
+        std::string message;
+    } rows[] = {
+        {{"A", "b"}, ""},
+        {{"B", "A"}, ""},
+        {{}, ""},
+        {{"A"}, "found no value for the key \"B\"" + behind + "; give it there too, or leave the name out"},
+        {{"A", "B", "Bogus"},
+         "found the key \"Bogus\"" + behind + ", which has no such key; remove it there, or correct the declaration"},
+        {{"A", "B", "Plain"},
+         "found the key \"Plain\"" + behind + ", which has no such key; remove it there, or correct the declaration"},
+    };
+    const auto property = [this](const std::string& name, bool isKey) {
+        return "<PROPERTY NAME=\"" + name + "\" TYPE=\"string\">" + (isKey ? fKey : "") + "</PROPERTY>";
+    };
+    for (const auto& row : rows) {
+        std::string bindings;
+        for (const std::string& name : row.names) {
+            bindings += "<KEYBINDING NAME=\"" + name + "\"><KEYVALUE>1</KEYVALUE></KEYBINDING>";
+        }
+        const std::string named = "<VALUE.NAMEDINSTANCE><INSTANCENAME CLASSNAME=\"Port\">" + bindings +
+                                  "</INSTANCENAME><INSTANCE CLASSNAME=\"Port\">" + L::Property("A", "string", "1") +
+                                  L::Property("B", "string", "1") + L::Property("Plain", "string", "1") +
+                                  "</INSTANCE></VALUE.NAMEDINSTANCE>\n";
+        for (const bool hasKeys : {true, false}) {
+            const std::string cls = Port(property("A", hasKeys) + property("B", hasKeys) + property("Plain", false));
+            for (const std::string& document : {cls + named, named + cls}) {
+                const std::string outcome = Outcome({document});
+                const std::size_t found = outcome.find("found ");
+                EXPECT_EQ(hasKeys ? row.message : "", found == std::string::npos ? "" : outcome.substr(found)) << document;
+            }
+        }
+    }
+}
+
+/// The key may be left unnamed if there is only one.
+TEST_F(RepeatsTest, AKeyWithoutANameIsTheOnlyOne)
+{
+    const auto document = [this](const std::string& value) {
+        return fDisk + "<VALUE.NAMEDINSTANCE><INSTANCENAME CLASSNAME=\"Disk\"><KEYVALUE>" + value +
+               "</KEYVALUE></INSTANCENAME><INSTANCE CLASSNAME=\"Disk\">" + L::Property("Id", "string", "a") +
+               "</INSTANCE></VALUE.NAMEDINSTANCE>";
+    };
+    EXPECT_EQ(0U, Outcome({document("a")}).find("1 classes, 1 instances\n"));
+    EXPECT_NE(std::string::npos, Outcome({document("b")}).find("found \"a\" in the key \"Id\""));
+}
+
 }  // namespace
 }  // namespace NORVZEL20
