@@ -3,7 +3,8 @@
 //     properties   those of all instances together, each with the type that its element names; null ones count
 //     keys         those in the names in front of instances; all names must have the same ones
 //     key types    that of the property. If no instance has the property, that of the key in the name: a number without TYPE is
-//                  uint64, sint64 if one is negative, and real64 if one has a fraction
+//                  uint64, sint64 if one is negative, and real64 if one has a fraction, or if one is negative and another
+//                  too large for sint64
 //
 // A reference may refer to any class, because the next instance may refer to another one. A property with an embedded object gets
 // the qualifier EmbeddedObject, and a class with a reference the qualifier Association. Nothing is known of superclasses,
@@ -12,6 +13,8 @@
 
 #include <algorithm>
 #include <boost/algorithm/string/join.hpp>
+#include <cstdint>
+#include <limits>
 
 #include "embedded/load/MessageText.h"
 #include "embedded/value/TValueAccess.h"
@@ -50,11 +53,11 @@ bool IsNumberOfName(TCIMValue::TCIMType type)
     return type == TType::kUint64 || type == TType::kSint64 || type == TType::kReal64;
 }
 
-// The type for the numbers of both types.
-TCIMValue::TCIMType Widen(TCIMValue::TCIMType a, TCIMValue::TCIMType b)
+// Whether no sint64 is that large.
+bool IsBeyondSigned(const TCIMValue& value)
 {
-    using TType = TCIMValue::TCIMType;
-    return a == TType::kReal64 || b == TType::kReal64 ? TType::kReal64 : TType::kSint64;
+    return value.GetType() == TCIMValue::TCIMType::kUint64 &&
+           value.GetUnsigned() > static_cast<std::uint64_t>(std::numeric_limits<std::int64_t>::max());
 }
 
 }  // namespace
@@ -119,7 +122,7 @@ TClassInference::TProperty& TClassInference::FindProperty(TClass& cls, const std
         return cls.properties[known->second];
     }
     cls.numbers.emplace(name, cls.properties.size());
-    cls.properties.push_back({name, type, place, false, false, false});
+    cls.properties.push_back({name, type, place, false, false, false, false});
     return cls.properties.back();
 }
 
@@ -158,23 +161,26 @@ void TClassInference::NoteKeys(TClass& cls, const TDraft& instance)
                       EAdvice::kGiveDeclaration);
     }
     for (const auto& [name, value] : instance.ownKeys) {
-        NoteKey(cls, name, value.GetType(), instance.place);
+        NoteKey(cls, name, value, instance.place);
     }
 }
 
-void TClassInference::NoteKey(TClass& cls, const std::string& name, TType type, const TLoadPlace& place)
+void TClassInference::NoteKey(TClass& cls, const std::string& name, const TCIMValue& value, const TLoadPlace& place)
 {
+    const TType type = value.GetType();
     const std::size_t before = cls.properties.size();
     TProperty& known = FindProperty(cls, name, type, place);
     known.isOfName = known.isOfName || cls.properties.size() > before;
     known.isKey = true;
+    known.isBeyondSigned = known.isBeyondSigned || IsBeyondSigned(value);
     if (!known.isOfName || known.type == type) {
         return;
     }
     if (!IsNumberOfName(type) || !IsNumberOfName(known.type)) {
         FailType(cls, known, type);
     }
-    known.type = Widen(known.type, type);
+    const bool isReal = known.type == TType::kReal64 || type == TType::kReal64 || known.isBeyondSigned;
+    known.type = isReal ? TType::kReal64 : TType::kSint64;
 }
 
 std::vector<TDraft> TClassInference::MakeClasses() const

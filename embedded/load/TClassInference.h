@@ -40,6 +40,7 @@ class TClassInference {
         bool isObject = false;  // an embedded object is a value of it
         bool isOfName = false;  // known from names alone, so its type is only what a name shows
         bool isKey = false;
+        bool isBeyondSigned = false;  // a name gives a number too large for sint64
     };
 
     struct TClass {
@@ -56,7 +57,7 @@ class TClassInference {
     static TProperty& FindProperty(TClass& cls, const std::string& name, TType type, const TLoadPlace& place);
     void NoteProperty(TClass& cls, const TEmbeddedObject::TProperty& property, const TLoadPlace& place);
     void NoteKeys(TClass& cls, const TDraft& instance);
-    void NoteKey(TClass& cls, const std::string& name, TType type, const TLoadPlace& place);
+    void NoteKey(TClass& cls, const std::string& name, const TCIMValue& value, const TLoadPlace& place);
     [[noreturn]] void FailType(const TClass& cls, const TProperty& known, TType type) const;
     TDraft MakeClass(const TClass& cls) const;
 

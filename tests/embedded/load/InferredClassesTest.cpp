@@ -103,6 +103,12 @@ TEST_F(InferredClassesTest, TakeKeysFromNamesAlone)
         {"a number", KeyBinding("Id", "1", "VALUETYPE=\"numeric\""), KeyBinding("Id", "2", "VALUETYPE=\"numeric\""), "uint64"},
         {"a negative one", KeyBinding("Id", "1", "VALUETYPE=\"numeric\""), KeyBinding("Id", "-2", "VALUETYPE=\"numeric\""),
          "sint64"},
+        {"a negative one behind one that is too large", KeyBinding("Id", "9223372036854775808", "VALUETYPE=\"numeric\""),
+         KeyBinding("Id", "-5", "VALUETYPE=\"numeric\""), "real64"},
+        {"a negative one before one that is too large", KeyBinding("Id", "-5", "VALUETYPE=\"numeric\""),
+         KeyBinding("Id", "9223372036854775808", "VALUETYPE=\"numeric\""), "real64"},
+        {"a negative one and the largest", KeyBinding("Id", "-5", "VALUETYPE=\"numeric\""),
+         KeyBinding("Id", "9223372036854775807", "VALUETYPE=\"numeric\""), "sint64"},
         {"boolean", KeyBinding("Id", "true", "VALUETYPE=\"boolean\""), KeyBinding("Id", "false", "VALUETYPE=\"boolean\""),
          "boolean"},
     };
