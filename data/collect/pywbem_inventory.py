@@ -3,7 +3,8 @@
 
     pywbem_inventory.py https://array1:5989 root/cimv2 array1
 
-Takes all classes and instances of the namespace. Needs pywbem 1.0 or later. User and password come from ~/.netrc.
+Takes all classes and instances of the namespace. Needs pywbem 1.0 or later. User and password come from ~/.netrc. If it
+does not name the server, or is not there, the server is asked without them.
 """
 import netrc
 import os
@@ -15,7 +16,10 @@ import pywbem
 if len(sys.argv) != 4:
     sys.exit(__doc__)
 url, namespace, folder = sys.argv[1:]
-user, _, password = netrc.netrc().authenticators(urlsplit(url).hostname) or (None, None, None)
+try:
+    user, _, password = netrc.netrc().authenticators(urlsplit(url).hostname) or (None, None, None)
+except FileNotFoundError:
+    user = password = None
 server = pywbem.WBEMConnection(url, (user, password) if user else None, default_namespace=namespace)
 os.mkdir(folder)
 

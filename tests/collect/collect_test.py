@@ -60,15 +60,23 @@ class CollectTest(unittest.TestCase):
         self.assertNotEqual(0, self.collect_with_curl("DEB_Package").returncode)
         self.assertEqual([], self.server.requests)
 
-    def test_what_pywbem_saves_is_an_inventory(self):
+    def collect_with_pywbem(self):
         script = ROOT / "data/collect/pywbem_inventory.py"
+        return self.run_in_folder(sys.executable, str(script), self.server.url.removesuffix("/cimom"), "root/deb", "array1",
+                                  HOME=str(self.folder), PYTHONPATH=str(ROOT / "tests/collect/stand_in"))
+
+    def test_what_pywbem_saves_is_an_inventory(self):
         (self.folder / ".netrc").write_text("machine 127.0.0.1 login someone password secret\n")
         (self.folder / ".netrc").chmod(0o600)
-        result = self.run_in_folder(sys.executable, str(script), self.server.url.removesuffix("/cimom"), "root/deb", "array1",
-                                    HOME=str(self.folder), PYTHONPATH=str(ROOT / "tests/collect/stand_in"))
+        result = self.collect_with_pywbem()
         self.assertEqual((0, ""), (result.returncode, result.stderr))
         self.assertEqual(["DEB_Package.xml", "DEB_PackageDependency.xml", "classes.xml"], sorted(os.listdir(self.folder / "array1")))
         self.assertEqual(ALL, self.shown("array1"))
+
+    def test_pywbem_needs_no_password(self):
+        result = self.collect_with_pywbem()
+        self.assertEqual((0, ""), (result.returncode, result.stderr))
+        self.assertEqual(["DEB_Package.xml", "DEB_PackageDependency.xml", "classes.xml"], sorted(os.listdir(self.folder / "array1")))
 
     def test_what_wbemcli_prints_becomes_an_inventory(self):
         """The recipe of the manual, over what wbemcli -dx prints of a recorded answer."""
