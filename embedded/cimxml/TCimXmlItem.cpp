@@ -13,6 +13,7 @@ void TCimXmlItem::BeginArray(bool isOfReferences)
 {
     BeginValue();
     fElements.clear();
+    fMark = kNoMark;
     if (isOfReferences && fType.GetElementType() != TType::kReference) {
         fContext.Fail(EStatus::kTypeMismatch, "found an array of references as value of " + Quote(fName) + ", expected a " +
                                                   TValueText::DescribeType(fType.GetArrayType()));
@@ -74,23 +75,28 @@ void TCimXmlItem::ReadObject(std::string_view text, TCIMValue& value)
         value = fObjects.Read(text);
         return;
     }
+    fMark = fMark == kNoMark ? fContext.GetBadValues().GetMark() : fMark;
     try {
         value = fObjects.Read(text);
     } catch (const TPopulateError& error) {
-        if (error.GetStatusCode().GetStatus() == EStatus::kOutOfMemory) {
+        if (!fContext.LetsPass(error)) {
             throw;
         }
         NoteBad(text, "class or instance");
     }
 }
 
-/// An array is one of texts then: the elements that fit are written as values of their type are.
+/// An array is one of texts then: the elements that fit are written as values of their type are. Objects among them are discarded,
+/// with the bad values in them.
 TBadValue TCimXmlItem::TakeBad()
 {
     const std::vector<TBadText> bad = std::exchange(fBadTexts, {});
     TBadValue result{0, TCIMValue::FromText(bad.front().text), bad.front().text, bad.front().type, bad.front().place};
     if (!fType.IsArray()) {
         return result;
+    }
+    if (fMark != kNoMark) {
+        fContext.GetBadValues().TakeBack(fMark);
     }
     for (TCIMValue& element : fElements) {
         element = element.IsNull() ? TCIMValue::Null(TType::kString) : TCIMValue::FromText(element.ToText());

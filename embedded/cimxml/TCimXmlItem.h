@@ -78,6 +78,8 @@ class TCimXmlItem {
         TLoadPlace place;
     };
 
+    static constexpr std::size_t kNoMark = static_cast<std::size_t>(-1);
+
     void Parse(std::string_view text, TCIMValue& value);
     void NoteBad(std::string_view text, const char* type);
     void ReadObject(std::string_view text, TCIMValue& value);
@@ -94,6 +96,7 @@ class TCimXmlItem {
     TCIMValue fValue;
     std::vector<TCIMValue> fElements;  // of the array that is open; kept for its memory
     std::vector<TBadText> fBadTexts;   // in the order of the elements
+    std::size_t fMark = kNoMark;       // of the bad values, in front of the array's first object
 };
 
 }  // namespace NORVZEL20

@@ -57,30 +57,19 @@ TCimXmlObjectReader::~TCimXmlObjectReader() = default;
 
 TCIMValue TCimXmlObjectReader::Read(std::string_view text)
 {
-    const std::size_t depth = fContext.GetEmbeddedDepth();
+    const TLoadContext::TEmbedded embedded(fContext);
     try {
-        fContext.EnterEmbeddedObject();
         if (!fNested) {
             fNested = std::make_unique<TNested>(fContext, fNamespace, fParser);
         }
         TCIMValue value(fNested->Read(text));
-        fContext.LeaveEmbeddedObject();
         if (fNested->TakeMetUnsettled()) {
             fPaths.NoteUnsettled();
         }
         return value;
     } catch (...) {
-        Abandon(depth);
+        fNested.reset();  // it is in the middle of the text
         throw;
-    }
-}
-
-/// Makes ready for another text after an error in the middle of one.
-void TCimXmlObjectReader::Abandon(std::size_t depth) noexcept
-{
-    fNested.reset();
-    while (fContext.GetEmbeddedDepth() > depth) {
-        fContext.LeaveEmbeddedObject();
     }
 }
 

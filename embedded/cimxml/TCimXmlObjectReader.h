@@ -34,8 +34,6 @@ class TCimXmlObjectReader {
   private:
     class TNested;
 
-    void Abandon(std::size_t depth) noexcept;
-
     TLoadContext& fContext;
     boost::shared_ptr<const TInMemNamespace> fNamespace;
     TCimXmlPathReader& fPaths;

@@ -2,7 +2,8 @@
 //
 // Such a value does not end a load at once, whatever is to become of it: its instance is filled on, with the value as text or NULL,
 // and the value is noted here. If it is to be refused, the load fails at its end, or at the next error. The message is about the
-// first value, which is the first thing that is wrong, and gives the number of all others.
+// first value, which is the first thing that is wrong, and gives the number of all others. A value within an embedded object that
+// turns out to be bad itself is taken back, since the object is discarded.
 //
 // Large inventories tend to have one wrong declaration and thousands of values that do not fit it, so values are counted for each
 // property, and only the first is described. Its instance is named when that has ended: the keys may come behind the value.
@@ -12,7 +13,7 @@
 
 namespace NORVZEL20 {
 
-void TBadValues::Note(TBadProperty first, bool isInInstance)
+void TBadValues::Note(TBadProperty first, bool isInInstance, bool isEmbedded)
 {
     const auto [entry, isFirst] = fPositions.emplace(std::make_pair(first.className, first.property), fFound.size());
     if (isFirst) {
@@ -22,6 +23,25 @@ void TBadValues::Note(TBadProperty first, bool isInInstance)
         }
     }
     ++fFound[entry->second].count;
+    if (isEmbedded) {
+        fEmbedded.push_back(entry->second);
+    }
+}
+
+/// The last one comes first, so a record that becomes empty is the last one.
+void TBadValues::TakeBack(std::size_t mark) noexcept
+{
+    for (; fEmbedded.size() > mark; fEmbedded.pop_back()) {
+        const std::size_t position = fEmbedded.back();
+        if (--fFound[position].count > 0) {
+            continue;
+        }
+        if (!fNameless.empty() && fNameless.back() == position) {
+            fNameless.pop_back();
+        }
+        fPositions.erase(fPositions.find({fFound[position].className, fFound[position].property}));
+        fFound.pop_back();
+    }
 }
 
 void TBadValues::NameInstance(const TCIMReference& path)

@@ -14,15 +14,20 @@ namespace NORVZEL20 {
 
 /// Counts the values of a load that do not fit their types, property by property, and describes the first one.
 ///
-/// What fits costs nothing here. Memory: one record for each property that has such values. Errors: std::bad_alloc.
+/// What fits costs nothing here. Memory: one record for each property that has such values, and a number for each such value within
+/// an embedded object. Errors: std::bad_alloc.
 class TBadValues {
   public:
     /// `found` gets a record for each property, in the order of their first values. It must outlive this.
     explicit TBadValues(std::vector<TBadProperty>& found) noexcept : fFound(found) {}
 
     /// Counts a value of the property that `first` names. Its other fields are kept if it is the first one; `instance` can be left
-    /// out, if `isInInstance` says that NameInstance is going to be called.
-    void Note(TBadProperty first, bool isInInstance);
+    /// out, if `isInInstance` says that NameInstance is going to be called. `isEmbedded` says that TakeBack may be called.
+    void Note(TBadProperty first, bool isInInstance, bool isEmbedded);
+    /// How many embedded values were counted.
+    std::size_t GetMark() const noexcept { return fEmbedded.size(); }
+    /// Uncounts the embedded values since the mark. Call it only if no others were counted since then.
+    void TakeBack(std::size_t mark) noexcept;
     bool HasAny() const noexcept { return !fFound.empty(); }
 
     /// Whether records still lack the instance that their first value stands in.
@@ -40,6 +45,7 @@ class TBadValues {
     std::vector<TBadProperty>& fFound;
     std::map<std::pair<std::string, std::string>, std::size_t> fPositions;  // in fFound, by class and property
     std::vector<std::size_t> fNameless;                                     // positions in fFound
+    std::vector<std::size_t> fEmbedded;                                     // likewise, of each embedded value
 };
 
 }  // namespace NORVZEL20

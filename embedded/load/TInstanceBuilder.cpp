@@ -228,13 +228,15 @@ void TInstanceBuilder::FillDefaults()
 bool TInstanceBuilder::ReadObjects(const TLoadTarget& target, const TCIMValue& written, const TReadObjects& readObjects,
                                    TCIMValue& value) const
 {
+    const std::size_t mark = fContext.GetBadValues().GetMark();
     try {
         value = target.isEmbedded ? readObjects(written) : written;
         return true;
     } catch (const TPopulateError& error) {
-        if (fContext.GetOptions().badValues == EBadValues::kRefuse || error.GetStatusCode().GetStatus() == EStatus::kOutOfMemory) {
+        if (!fContext.LetsPass(error)) {
             throw;
         }
+        fContext.GetBadValues().TakeBack(mark);  // those of elements in front of it
         return false;
     }
 }

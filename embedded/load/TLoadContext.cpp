@@ -82,7 +82,7 @@ void TLoadContext::NoteBadValue(const TBadValue& bad, const std::string& classNa
     first.document = NameOf(bad.place);
     first.line = bad.place.place.line;
     first.column = bad.place.place.column;
-    fBadValues.Note(std::move(first), isInInstance);
+    fBadValues.Note(std::move(first), isInInstance, fEmbeddedDepth > 0);
 }
 
 void TLoadContext::FailBadKey(const TBadValue& bad, const std::string& className, const std::string& property) const
@@ -114,6 +114,11 @@ void TLoadContext::EnterEmbeddedObject()
         Fail(TZELStatusCode::kParseError, "embedded objects are nested too deeply");
     }
     ++fEmbeddedDepth;
+}
+
+bool TLoadContext::LetsPass(const TPopulateError& error) const noexcept
+{
+    return fOptions.badValues != EBadValues::kRefuse && error.GetStatusCode().GetStatus() != TZELStatusCode::kOutOfMemory;
 }
 
 TLoadPlace TLoadContext::GetPlace() const

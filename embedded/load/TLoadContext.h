@@ -1,6 +1,7 @@
 #pragma once
 
 #include <cstddef>
+#include <exception>
 #include <optional>
 #include <string>
 #include <string_view>
@@ -43,6 +44,32 @@ class CIMDELTA_INTERNAL_EXPORT TLoadContext {
       private:
         TLoadContext& fContext;
         std::optional<TLoadPlace> fEarlier;
+    };
+
+    /// Stands around the reading of an embedded object; messages then mention that they are about one. If an exception ends it, the
+    /// object is discarded, so the values within it that do not fit are not counted.
+    class TEmbedded {
+      public:
+        /// Errors: fails with kParseError (9) if objects are nested too deeply.
+        explicit TEmbedded(TLoadContext& context)
+            : fContext(context), fMark(context.fBadValues.GetMark()), fExceptions(std::uncaught_exceptions())
+        {
+            context.EnterEmbeddedObject();
+        }
+        TEmbedded(const TEmbedded&) = delete;
+        TEmbedded& operator=(const TEmbedded&) = delete;
+        ~TEmbedded()
+        {
+            --fContext.fEmbeddedDepth;
+            if (std::uncaught_exceptions() > fExceptions) {
+                fContext.fBadValues.TakeBack(fMark);
+            }
+        }
+
+      private:
+        TLoadContext& fContext;
+        std::size_t fMark;
+        int fExceptions;
     };
 
     /// `embeddedDepth` is how many embedded objects what is read stands in.
@@ -102,10 +129,8 @@ class CIMDELTA_INTERNAL_EXPORT TLoadContext {
     /// answer whose continuation is missing; see TLoadContents.
     void CheckContents();
 
-    /// Call these two around the reading of an embedded object; messages then mention that they are about one. Errors: fails with
-    /// kParseError (9) if objects are nested too deeply.
-    void EnterEmbeddedObject();
-    void LeaveEmbeddedObject() noexcept { --fEmbeddedDepth; }
+    /// Whether an embedded object that cannot be read is a bad value, as TLoadOptions::badValues says, and not the end of the load.
+    bool LetsPass(const TPopulateError& error) const noexcept;
     std::size_t GetEmbeddedDepth() const noexcept { return fEmbeddedDepth; }
 
     /// Checks a name that may become part of a path. `what` says what it names: "class", "property" or "key". Errors: fails with
@@ -127,6 +152,7 @@ class CIMDELTA_INTERNAL_EXPORT TLoadContext {
     }
 
   private:
+    void EnterEmbeddedObject();
     std::string NameOf(const TLoadPlace& place) const;
 
     struct TOpen {

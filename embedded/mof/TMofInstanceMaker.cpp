@@ -82,10 +82,8 @@ TCIMValue TMofInstanceMaker::Resolve(const TMofValue& value)
     if (value.kind == TMofValue::kAlias) {
         return fAliases.GetReference(value.text);
     }
-    fContext.EnterEmbeddedObject();
-    boost::shared_ptr<const TEmbeddedObject> object = boost::make_shared<TEmbeddedObject>(MakeObject(*value.object));
-    fContext.LeaveEmbeddedObject();
-    return TCIMValue(std::move(object));
+    const TLoadContext::TEmbedded embedded(fContext);
+    return TCIMValue(boost::shared_ptr<const TEmbeddedObject>(boost::make_shared<TEmbeddedObject>(MakeObject(*value.object))));
 }
 
 TEmbeddedObject TMofInstanceMaker::MakeObject(const TMofInstance& instance)
@@ -116,10 +114,8 @@ TCIMValue TMofInstanceMaker::ReadObjects(const TCIMValue& value)
     if (!TValueAccess::IsText(value) || !IsPerhapsMof(value.GetString())) {
         return value;
     }
-    fContext.EnterEmbeddedObject();
-    TCIMValue object(ReadObjectText(value.GetString()));
-    fContext.LeaveEmbeddedObject();
-    return object;
+    const TLoadContext::TEmbedded embedded(fContext);
+    return TCIMValue(ReadObjectText(value.GetString()));
 }
 
 /// The semicolon behind an object may be missing.

@@ -93,12 +93,11 @@ TMofValue TMofValueParser::ReadObject()
 {
     TMofValue value;
     value.kind = TMofValue::kObject;
-    fTokens.GetContext().EnterEmbeddedObject();
+    const TLoadContext::TEmbedded embedded(fTokens.GetContext());
     TMofQualifierParser::Skip(fTokens);
     const TLoadPlace place = fTokens.GetPlace();
     fTokens.ExpectKeyword("instance");
     value.object = std::make_shared<const TMofInstance>(ReadInstance(place));
-    fTokens.GetContext().LeaveEmbeddedObject();
     return value;
 }
 
