@@ -2,6 +2,7 @@
 
 #include <algorithm>
 
+#include "client/files/TInputFile.h"
 #include "client/inventory/TSourceReader.h"
 #include "client/process/LackOfMemory.h"
 #include "client/process/TClientError.h"
@@ -31,9 +32,24 @@ std::string DescribeAdvice(const TPopulateError& error, const TLoadingOptions& o
         return " with --bad-values null or --bad-values text";
     case EAdvice::kKeepBadValuesAsText:
         return " with --bad-values text";
+    case EAdvice::kLeaveFileOut:
+        return ", MOF or a recorded answer of HTTP; leave out what is no inventory";
+    case EAdvice::kPlaceIncludedFile:
+        return error.GetFile() == NameOfInput("-") ? ": save standard input to a file beside it"
+                                                   : " (those of the files that are read, and all below them)";
     default:
         return "";
     }
+}
+
+// How often it was tolerated; follows its text. Empty for once.
+std::string CountTolerated(const TLoadReport::TTolerated& tolerated)
+{
+    const std::size_t same = tolerated.count - tolerated.others;
+    const std::string times = same > 1 ? std::to_string(same) + " times" : "";
+    const std::string others = tolerated.others > 0 ? std::to_string(tolerated.others) + " more of this kind" : "";
+    const std::string all = times + (times.empty() || others.empty() ? "" : ", ") + others;
+    return all.empty() ? "" : " (" + all + ")";
 }
 
 }  // namespace

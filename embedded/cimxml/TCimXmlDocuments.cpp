@@ -9,6 +9,7 @@
 #include <boost/ref.hpp>
 #include <boost/smart_ptr/make_shared.hpp>
 #include <memory>
+#include <string_view>
 
 #include "embedded/cimxml/ReadObjectKey.h"
 #include "embedded/cimxml/TCimXmlObjectReader.h"
@@ -42,6 +43,7 @@ class TDocument {
     void ReadMemory(const char* data, std::size_t length)
     {
         RefuseEmpty(length);
+        NoteFirst(std::string_view(data, length));
         Check(fXml.Parse(data, length, true));
     }
 
@@ -53,8 +55,10 @@ class TDocument {
         do {
             // A tag that has not ended is read again with each piece. Pieces as long as that tag keep the total linear.
             room = std::max(kReadPiece, fXml.GetPending());
-            length = Fill(source, fXml.GetBuffer(room), room);
+            char* const buffer = fXml.GetBuffer(room);
+            length = Fill(source, buffer, room);
             total += length;
+            NoteFirst(std::string_view(buffer, length));
             Check(fXml.ParseBuffer(length));
         } while (length == room);
         RefuseEmpty(total);
@@ -76,6 +80,23 @@ class TDocument {
         return length;
     }
 
+    /// Notes the first byte that is no blank and no part of a byte order mark, and its place. What does not begin with "<" is no
+    /// XML, and where the parser gives up is of no interest then.
+    void NoteFirst(std::string_view text)
+    {
+        constexpr std::string_view kBlanks(" \t\r\n");
+        constexpr std::string_view kMark("\0\xef\xbb\xbf\xfe\xff", 6);  // in UTF-16, a zero byte belongs to each blank
+        for (std::size_t i = 0; i < text.size() && fFirst == '\0'; ++i) {
+            if (text[i] == '\n') {
+                fFirstPlace = {fFirstPlace.line + 1, 1};
+            } else if (kBlanks.find(text[i]) != std::string_view::npos) {
+                ++fFirstPlace.column;
+            } else if (kMark.find(text[i]) == std::string_view::npos) {
+                fFirst = text[i];
+            }
+        }
+    }
+
     void RefuseEmpty(std::size_t length) const
     {
         if (length == 0) {
@@ -88,6 +109,10 @@ class TDocument {
         if (succeeded) {
             return;
         }
+        if (fFirst != '\0' && fFirst != '<') {
+            const TLoadContext::TAt at(fContext, {fContext.CountDocuments() - 1, fFirstPlace});
+            fContext.Fail(EStatus::kParseError, "found no XML, expected CIM-XML", EAdvice::kLeaveFileOut);
+        }
         const std::string open = fReader.GetOpenElement();
         const std::string end = fXml.IsCutOff() && !open.empty()
                                     ? "; the document ends within <" + open + ">, so it was cut off: fetch or write it again"
@@ -98,6 +123,8 @@ class TDocument {
     TLoadContext& fContext;
     TCimXmlReader fReader;
     TXmlReader fXml;
+    char fFirst = '\0';  // see NoteFirst
+    TTextPlace fFirstPlace{1, 1};
 };
 
 /// Reads texts when all documents have ended, for classes that were declared after the instances.

@@ -90,17 +90,19 @@ bool TMofFolders::Find(const std::string& name, const std::string& from, TFile& 
     std::replace(plain.begin(), plain.end(), '\\', '/');
     std::vector<std::string> tried{GetFolder(from)};
     tried.insert(tried.end(), fFolders.begin(), fFolders.end());
-    bool isOutside = plain.empty() || plain.front() == '/';
-    for (std::size_t index = 0; index < tried.size() && !isOutside; ++index) {
+    const bool isBadName = plain.empty() || plain.front() == '/';
+    bool isOutside = isBadName;
+    for (std::size_t index = 0; index < tried.size() && !isBadName; ++index) {
         file.name = tried[index] + plain;
         file.identity = Resolve(file.name);
         if (Contains(file.identity)) {
             return true;
         }
-        isOutside = index > 0 && !file.identity.empty();
+        isOutside = isOutside || !file.identity.empty();
     }
-    reason = isOutside ? "which is outside of the folders given for included files; put it into one of them, or give its folder"
-                       : "which is not in the folders given for included files; give the folder that it is in";
+    reason = fFolders.empty() ? "but no folders are given for included files; give the folder that it is in"
+             : isOutside      ? "which is outside of the folders given for included files; put it into one of them"
+                              : "which is not there; put it into one of the folders given for included files";
     return false;
 }
 

@@ -105,7 +105,7 @@ void TMofReader::Include(const std::string& name)
     IMofIncludes::TFile file;
     std::string reason;
     if (!fIncludes->Find(name, fOpenNames.back(), file, reason)) {
-        fContext.Fail(EStatus::kParseError, found + reason);
+        fContext.Fail(EStatus::kParseError, found + reason, EAdvice::kPlaceIncludedFile);
     }
     if (std::find(fOpenFiles.begin(), fOpenFiles.end(), file.identity) != fOpenFiles.end()) {
         fContext.Fail(EStatus::kParseError, found + "which includes this document; remove one of the two");

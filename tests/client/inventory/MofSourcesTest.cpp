@@ -72,8 +72,21 @@ TEST_F(MofSourcesTest, FilesMayBeIncludedFromTheSameFolderAndBelow)
     const std::string main = "#pragma include (\"qualifiers.mof\")\n#pragma include (\"below/disk.mof\")\n";
     EXPECT_EQ("Disk: 1 instance\n", Show(Write("main.mof", main + kSda)));
     Write("other/main.mof", "#pragma include (\"../qualifiers.mof\")\n");
-    EXPECT_EQ(0u, Show(fFolder / "other/main.mof").find("cimdelta: F/other/main.mof:1:")) << fErr;
-    EXPECT_EQ(0u, Shell("show -", "cat " + (fFolder / "main.mof") + " | ").find("[2]\n--\ncimdelta: standard input:1:"));
+    const std::string folders = " (those of the files that are read, and all below them)\n";
+    EXPECT_EQ(
+        "cimdelta: F/other/main.mof:1:37: found an include of \"../qualifiers.mof\", which is outside of the folders given for "
+        "included files; put it into one of them" +
+            folders,
+        Show(fFolder / "other/main.mof"));
+    EXPECT_EQ(
+        "cimdelta: F/lost.mof:1:28: found an include of \"none.mof\", which is not there; put it into one of the folders given "
+        "for included files" +
+            folders,
+        Show(Write("lost.mof", "#pragma include (\"none.mof\")\n")));
+    EXPECT_EQ(
+        "[2]\n--\ncimdelta: standard input:1:34: found an include of \"qualifiers.mof\", but no folders are given for included "
+        "files; give the folder that it is in: save standard input to a file beside it\n",
+        Shell("show -", "cat " + (fFolder / "main.mof") + " | "));
 }
 
 TEST_F(MofSourcesTest, TheResultNeverReplacesAnIncludedFile)

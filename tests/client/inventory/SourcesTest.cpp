@@ -73,6 +73,17 @@ TEST_F(SourcesTest, NothingBesidesOrdinaryFilesIsReadInAFolder)
     EXPECT_EQ("Disk: 0 instances\n", fOut);
 }
 
+TEST_F(SourcesTest, AFileThatIsNoInventoryIsRefused)
+{
+    const std::string message =
+        "1:1: found no XML, expected CIM-XML, MOF or a recorded answer of HTTP; leave out what is no inventory\n";
+    Write("web01/a.xml", kDiskClass);
+    for (const char* text : {"The disks of web01, as of today.\n", "{\"disks\": []}", "#!/bin/sh\n", "\x7f\x45LF", "a,b\n1,2\n"}) {
+        std::ofstream(fFolder / "web01/z") << text;
+        EXPECT_EQ("cimdelta: F/web01/z:" + message, Message({"show", fFolder / "web01"})) << text;
+    }
+}
+
 TEST_F(SourcesTest, AFolderWithoutFilesIsRefused)
 {
     Write("web01/below/.hidden", "");

@@ -31,7 +31,9 @@ std::string ClassWithCounter()
 const TBadInputRow kRows[] = {
     {"empty", "", 9, "doc.xml:1:1: found an empty document, expected CIM-XML"},
     {"blank", "\n\n", 9, "doc.xml:3:1: found malformed XML: no element found"},
-    {"no XML at all", "hello", 9, "doc.xml:1:1: found malformed XML: syntax error"},
+    {"no XML at all", "hello", 9, "doc.xml:1:1: found no XML, expected CIM-XML"},
+    {"no XML behind blanks and a byte order mark", "\xef\xbb\xbf\n{\"a\": 1}", 9, "doc.xml:2:1: found no XML, expected CIM-XML"},
+    {"no XML in UTF-16", std::string("\xff\xfeh\0i\0", 6), 9, "doc.xml:1:1: found no XML, expected CIM-XML"},
     {"truncated", kHead + "<VALUE.OBJECT>\n", 9,
      "doc.xml:3:1: found malformed XML: no element found; the document ends within <VALUE.OBJECT>, so it was cut off: fetch or "
      "write it again"},

@@ -127,9 +127,8 @@ TEST_F(MofFoldersTest, FilesOfTheGivenFoldersMayBeIncluded)
 
 TEST_F(MofFoldersTest, NothingElseMayBeIncluded)
 {
-    const std::string outside =
-        "which is outside of the folders given for included files; put it into one of them, or give its folder";
-    const std::string nowhere = "which is not in the folders given for included files; give the folder that it is in";
+    const std::string outside = "which is outside of the folders given for included files; put it into one of them";
+    const std::string nowhere = "which is not there; put it into one of the folders given for included files";
     const struct {
         std::string name;
         std::string reason;
