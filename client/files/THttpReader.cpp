@@ -223,14 +223,24 @@ void THttpReader::ReadHeader(const std::string& line)
     }
 }
 
+// What can be done about the status of an answer.
+std::string THttpReader::AdviseOnStatus() const
+{
+    const std::string code = fStatus.substr(0, 3);
+    return code == "401" || code == "407" ? "ask with the name and the password of a user"
+           : code == "403"                ? "ask as a user who may read this"
+           : code == "404"                ? "correct the path in the address of the server"
+                                          : "ask the server again";
+}
+
 void THttpReader::CheckStatus() const
 {
     if (fStatus.empty() || fStatus[0] == '1' || fStatus[0] == '2') {
         return;
     }
     Fail("found the answer \"" + fStatus.substr(0, 80) + "\"" +
-         (fCimError.empty() ? "" : " (CIMError: " + fCimError.substr(0, 80) + ")") +
-         ", expected one with objects; ask the server again");
+         (fCimError.empty() ? "" : " (CIMError: " + fCimError.substr(0, 80) + ")") + ", expected one with objects; " +
+         AdviseOnStatus());
 }
 
 void THttpReader::ReadChunkLength()

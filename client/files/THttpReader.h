@@ -40,6 +40,7 @@ class THttpReader : public IByteSource {
     void BeginMessage();
     void ReadHeaders();
     void ReadHeader(const std::string& line);
+    std::string AdviseOnStatus() const;
     void CheckStatus() const;
     void ReadChunkLength();
     void EndChunk();

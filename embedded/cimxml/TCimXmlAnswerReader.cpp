@@ -1,6 +1,8 @@
 #include "embedded/cimxml/TCimXmlAnswerReader.h"
 
 #include <array>
+#include <map>
+#include <string>
 
 #include "embedded/load/MessageText.h"
 #include "embedded/value/TNameText.h"
@@ -55,6 +57,26 @@ std::string DescribeStatus(const char* code)
     return std::string(kStatusNames[number.GetUnsigned()]) + " (" + code + ")";
 }
 
+/// What can be done about a status that a server answers with, by its number.
+const char* AdviseOnStatus(const std::string& code)
+{
+    static const std::map<std::string, const char*> kAdvice = {
+        {"2", "ask as a user who may read this"},
+        {"3", "correct the namespace that the request names"},
+        {"4", "correct the parameters of the request"},
+        {"5", "correct the class that the request names"},
+        {"6", "correct the name in the request"},
+        {"7", "ask for the objects with another operation"},
+        {"14", "correct the language of the query"},
+        {"15", "correct the query"},
+        {"21", "begin again with the operation that opens the enumeration"},
+        {"25", "ask without a filter"},
+        {"26", "ask without continuation on error"},
+    };
+    const auto known = kAdvice.find(code);
+    return known != kAdvice.end() ? known->second : "ask the server again";
+}
+
 /// What to say if a load holds nothing but that element.
 const char* DescribeSkipped(TElement::EElement element)
 {
@@ -100,8 +122,8 @@ void TCimXmlAnswerReader::RefuseError(const TCimXmlAttributes& attributes) const
 {
     const std::string to = fOperation.empty() ? "" : " to " + Quote(fOperation);
     fContext.Fail(EStatus::kParseError, "found an error as the answer" + to + ": " + DescribeStatus(attributes.Get("CODE")) + ", " +
-                                            Quote(attributes.Get("DESCRIPTION")) +
-                                            "; expected an answer with objects, so ask the server again");
+                                            Quote(attributes.Get("DESCRIPTION")) + "; expected an answer with objects; " +
+                                            AdviseOnStatus(attributes.Get("CODE")));
 }
 
 void TCimXmlAnswerReader::RefuseRequest(const TCimXmlAttributes& attributes) const

@@ -93,7 +93,11 @@ TEST(HttpSourceTest, WhatIsNoAnswerWithObjectsIsRefusedWithItsLine)
         {"a request of the other kind", "M-POST /cimom HTTP/1.1\r\n\r\n",
          "F:1: found a request of HTTP, which is no inventory; load the server's answer instead"},
         {"another status", "HTTP/1.1 401 Unauthorized\r\nContent-Length: 0\r\n\r\n",
-         "F:3: found the answer \"401 Unauthorized\", expected one with objects; ask the server again"},
+         "F:3: found the answer \"401 Unauthorized\", expected one with objects; ask with the name and the password of a user"},
+        {"a status of no access", "HTTP/1.1 403 Forbidden\r\n\r\n",
+         "F:2: found the answer \"403 Forbidden\", expected one with objects; ask as a user who may read this"},
+        {"a status of a wrong address", "HTTP/1.1 404 Not Found\r\n\r\n",
+         "F:2: found the answer \"404 Not Found\", expected one with objects; correct the path in the address of the server"},
         {"another status with its reason", "HTTP/1.1 400 Bad Request\r\nCIMError: unsupported-operation\r\n\r\n",
          "F:3: found the answer \"400 Bad Request\" (CIMError: unsupported-operation), expected one with objects; ask the server"
          " again"},
@@ -162,7 +166,7 @@ TEST_F(WireTest, WhatIsNoInventoryIsRefused)
         " instance the answer to EnumerateInstances instead of the one to EnumerateInstanceNames\n",
         Show("001-wbemcli-ecn.response"));
     EXPECT_EQ("cimdelta: 019-wbemcli-err-class.response:11:1: found an error as the answer to \"GetClass\": CIM_ERR_NOT_FOUND (6),"
-              " \"CIM_ERR_NOT_FOUND: DEB_Missing\"; expected an answer with objects, so ask the server again\n",
+              " \"CIM_ERR_NOT_FOUND: DEB_Missing\"; expected an answer with objects; correct the name in the request\n",
               Show("019-wbemcli-err-class.response"));
     EXPECT_EQ("cimdelta: 031-pywbem-GetInstance.request:1: found a request of HTTP, which is no inventory; load the server's answer"
               " instead\n",

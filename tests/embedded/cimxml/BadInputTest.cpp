@@ -95,8 +95,8 @@ const TBadInputRow kRows[] = {
     {"class twice, differing", L::Group(L::Class("A") + ClassWithCounter()), 12,
      "doc.xml:3:15: found class \"A\" a second time, declared differently at doc.xml:2:15; remove one of the two"},
     {"recorded error", "<CIM><MESSAGE><SIMPLERSP><IMETHODRESPONSE><ERROR CODE=\"6\" DESCRIPTION=\"gone\"/>", 9,
-     "doc.xml:1:43: found an error as the answer: CIM_ERR_NOT_FOUND (6), \"gone\"; expected an answer with objects, so ask the "
-     "server again"},
+     "doc.xml:1:43: found an error as the answer: CIM_ERR_NOT_FOUND (6), \"gone\"; expected an answer with objects; correct "
+     "the name in the request"},
     {"two namespaces",
      L::Group("<LOCALNAMESPACEPATH><NAMESPACE NAME=\"a\"/></LOCALNAMESPACEPATH>\n"
               "<LOCALNAMESPACEPATH><NAMESPACE NAME=\"b\"/></LOCALNAMESPACEPATH>\n"),

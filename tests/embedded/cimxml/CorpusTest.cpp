@@ -223,7 +223,7 @@ TEST(PywbemResponseTest, ARecordedErrorIsAnError)
         FAIL();
     } catch (const TZELException& error) {
         EXPECT_EQ(kPywbem + "11-response-error.xml:2:128: found an error as the answer to \"GetInstance\": CIM_ERR_NOT_FOUND (6), "
-                            "\"not <found> & gone\"; expected an answer with objects, so ask the server again",
+                            "\"not <found> & gone\"; expected an answer with objects; correct the name in the request",
                   error.what());
     }
 }

@@ -102,9 +102,9 @@ TEST(FormsTest, WhatIsNoInventoryIsRefusedForWhatItIs)
         {"method.xml",
          "method.xml:3:12: found the answer to the call of a method, which holds no inventory; load answers with instances"},
         {"error.xml", "error.xml:4:1: found an error as the answer to \"GetInstance\": CIM_ERR_NOT_FOUND (6), \"no such disk\"; "
-                      "expected an answer with objects, so ask the server again"},
+                      "expected an answer with objects; correct the name in the request"},
         {"error-unknown.xml", "error-unknown.xml:4:1: found an error as the answer to \"Stop\": status \"4711\", \"\"; expected an "
-                              "answer with objects, so ask the server again"},
+                              "answer with objects; ask the server again"},
         {"request.xml", "request.xml:3:12: found a request to a server (\"EnumerateInstances\"), which is no inventory; load the "
                         "server's answer instead"},
         {"declarations.xml request-with-instance.xml",
