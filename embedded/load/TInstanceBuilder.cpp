@@ -8,6 +8,7 @@
 
 #include <algorithm>
 
+#include "embedded/load/AsText.h"
 #include "embedded/load/DropPlaces.h"
 #include "embedded/load/MessageText.h"
 #include "embedded/store/TReferenceAdapter.h"
@@ -26,19 +27,6 @@ constexpr std::uint32_t kFewInstances = 8;
 std::string Show(const TCIMValue& value)
 {
     return value.IsNull() ? "NULL" : Quote(value.ToText());
-}
-
-/// A string, or an array of strings and nulls.
-TCIMValue AsText(const TCIMValue& value)
-{
-    if (!value.GetType().IsArray()) {
-        return value.IsNull() ? TCIMValue::Null(TCIMValue::TCIMType::kString) : TCIMValue::FromText(value.ToText());
-    }
-    std::vector<TCIMValue> texts;
-    for (const TCIMValue& element : value.GetElements()) {
-        texts.push_back(AsText(element));
-    }
-    return TCIMValue(TCIMValue::TCIMType::kArrayString, static_cast<unsigned int>(texts.size()), texts);
 }
 
 }  // namespace

@@ -121,6 +121,15 @@ bool TLoadContext::LetsPass(const TPopulateError& error) const noexcept
     return fOptions.badValues != EBadValues::kRefuse && error.GetStatusCode().GetStatus() != TZELStatusCode::kOutOfMemory;
 }
 
+void TLoadContext::RefuseObject(const TPopulateError& error)
+{
+    if (error.GetAdvice() != EAdvice::kNone || error.GetStatusCode().GetStatus() == TZELStatusCode::kOutOfMemory) {
+        throw error;
+    }
+    throw TPopulateError(error.GetStatusCode(), error.GetMessage() + "; correct it, or have such values loaded as NULL or as text",
+                         error.GetFile(), error.GetLine(), error.GetColumn(), EAdvice::kLetBadValuesPass);
+}
+
 TLoadPlace TLoadContext::GetPlace() const
 {
     if (fPlace) {

@@ -131,6 +131,8 @@ class CIMDELTA_INTERNAL_EXPORT TLoadContext {
 
     /// Whether an embedded object that cannot be read is a bad value, as TLoadOptions::badValues says, and not the end of the load.
     bool LetsPass(const TPopulateError& error) const noexcept;
+    /// Throws the error about the text of an embedded object again, with what can be done instead of correcting it.
+    [[noreturn]] static void RefuseObject(const TPopulateError& error);
     std::size_t GetEmbeddedDepth() const noexcept { return fEmbeddedDepth; }
 
     /// Checks a name that may become part of a path. `what` says what it names: "class", "property" or "key". Errors: fails with

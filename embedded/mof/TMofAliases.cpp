@@ -38,6 +38,27 @@ TMofAliases::TMofAliases(TLoadContext& context, const TInMemNamespace& ns, const
     }
 }
 
+/// An alias whose reference is being made. The load may go on after a failure, if it was about the text of an embedded object.
+class TMofAliases::TOpen {
+  public:
+    TOpen(TEntry& entry, std::size_t& depth) noexcept : fEntry(entry), fDepth(depth)
+    {
+        entry.isOpen = true;
+        ++depth;
+    }
+    TOpen(const TOpen&) = delete;
+    TOpen& operator=(const TOpen&) = delete;
+    ~TOpen()
+    {
+        fEntry.isOpen = false;
+        --fDepth;
+    }
+
+  private:
+    TEntry& fEntry;
+    std::size_t& fDepth;
+};
+
 const TCIMValue& TMofAliases::GetReference(const std::string& alias)
 {
     const auto known = fEntries.find(alias);
@@ -54,11 +75,8 @@ const TCIMValue& TMofAliases::GetReference(const std::string& alias)
             fContext.Fail(EStatus::kParseError, "found aliases in each other's keys more than " +
                                                     std::to_string(TMofLimits::kMaxPathDepth) + " deep, expected fewer levels");
         }
-        ++fDepth;
-        entry.isOpen = true;
+        const TOpen open(entry, fDepth);
         entry.reference = MakeReference(*entry.instance);
-        entry.isOpen = false;
-        --fDepth;
     }
     return entry.reference;
 }

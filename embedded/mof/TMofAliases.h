@@ -32,6 +32,7 @@ class TMofAliases {
         bool isOpen = false;  // its reference is being made
         TCIMValue reference;  // null if it has not been made yet
     };
+    class TOpen;
 
     TCIMValue MakeReference(const TMofInstance& instance);
     TCIMValue ReadKey(const TMofInstance& instance, const TInMemPropertyDecl& decl);

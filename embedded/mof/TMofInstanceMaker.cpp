@@ -8,6 +8,7 @@
 #include <boost/smart_ptr/make_shared.hpp>
 #include <utility>
 
+#include "embedded/load/AsText.h"
 #include "embedded/load/MessageText.h"
 #include "embedded/mof/TMofClassParser.h"
 #include "embedded/mof/TMofTokens.h"
@@ -56,7 +57,12 @@ TDraft TMofInstanceMaker::Make(const TMofInstance& instance)
         const TLoadContext::TAt at(fContext, property.place);
         TEmbeddedObject::TProperty made;
         made.name = property.name;
-        made.value = ReadValue(FindDecl(cls.get(), property.name), property);
+        std::optional<TBadValue> bad;
+        made.value = ReadValue(FindDecl(cls.get(), property.name), property, bad);
+        if (bad) {
+            bad->property = draft.object.GetProperties().size();
+            draft.badValues.push_back(std::move(*bad));
+        }
         draft.object.AddProperty(std::move(made));
         draft.propertyPlaces.push_back(property.place);
     }
@@ -64,11 +70,13 @@ TDraft TMofInstanceMaker::Make(const TMofInstance& instance)
 }
 
 /// A value that does not fit its type is passed on with the type that its form suggests: the loader converts or refuses it.
-TCIMValue TMofInstanceMaker::ReadValue(const TInMemPropertyDecl* decl, const TMofInstance::TProperty& property)
+/// If there is a bad value, what is returned is NULL.
+TCIMValue TMofInstanceMaker::ReadValue(const TInMemPropertyDecl* decl, const TMofInstance::TProperty& property,
+                                       std::optional<TBadValue>& bad)
 {
     TCIMValue value;
     if (decl != nullptr && TMofTyping::Read(property.value, decl->GetType(), fResolve, value)) {
-        return decl->HoldsObjects() ? ReadObjects(value) : value;
+        return decl->HoldsObjects() ? ReadObjects(value, bad) : value;
     }
     if (!TMofTyping::Guess(property.value, fResolve, value)) {
         fContext.Fail(TZELStatusCode::kTypeMismatch, "found " + TMofTyping::Describe(property.value) + " in property " +
@@ -93,13 +101,34 @@ TEmbeddedObject TMofInstanceMaker::MakeObject(const TMofInstance& instance)
     for (const TMofInstance::TProperty& property : instance.properties) {
         TEmbeddedObject::TProperty made;
         made.name = property.name;
-        made.value = ReadValue(FindDecl(cls.get(), property.name), property);
+        std::optional<TBadValue> bad;
+        made.value = ReadValue(FindDecl(cls.get(), property.name), property, bad);
+        if (bad) {
+            fContext.NoteBadValue(*bad, instance.className, property.name, true);
+            made.value = fContext.GetOptions().badValues == EBadValues::kText ? bad->value : made.value;
+        }
         object.AddProperty(std::move(made));
     }
     return object;
 }
 
-TCIMValue TMofInstanceMaker::ReadObjects(const TCIMValue& value)
+/// The message of a load that refuses the text is about what is wrong inside of it.
+TCIMValue TMofInstanceMaker::ReadObjects(const TCIMValue& value, std::optional<TBadValue>& bad)
+{
+    const std::size_t mark = fContext.GetBadValues().GetMark();
+    try {
+        return ReadElements(value);
+    } catch (const TPopulateError& error) {
+        if (!fContext.LetsPass(error)) {
+            fContext.RefuseObject(error);
+        }
+    }
+    fContext.GetBadValues().TakeBack(mark);
+    bad = TBadValue{0, AsText(value), value.ToText(), "class or instance", fContext.GetPlace()};
+    return TCIMValue::Null(value.GetType());
+}
+
+TCIMValue TMofInstanceMaker::ReadElements(const TCIMValue& value)
 {
     if (value.IsNull()) {
         return value;
@@ -107,7 +136,7 @@ TCIMValue TMofInstanceMaker::ReadObjects(const TCIMValue& value)
     if (value.GetType().IsArray()) {
         std::vector<TCIMValue> elements;
         for (const TCIMValue& element : value.GetElements()) {
-            elements.push_back(ReadObjects(element));
+            elements.push_back(ReadElements(element));
         }
         return TCIMValue(value.GetType(), static_cast<unsigned int>(elements.size()), elements);
     }

@@ -134,9 +134,11 @@ const TBadMofRow kMistakes[] = {
     {"an alias of an unknown class", "instance of Part { On = $A; }; instance of Disc as $A { };", 15,
      "doc.mof:6:20: found the alias $A of an instance of class \"Disc\", which is not declared; give its declaration"},
     {"an object that does not end", "instance of Disk { Id = \"a\"; Inner = \"instance of Disk {\"; };", 9,
-     "doc.mof:6:30: in an embedded object: found the end of the document, expected the name of a property or }"},
+     "doc.mof:6:30: in an embedded object: found the end of the document, expected the name of a property or }; correct it, or "
+     "have such values loaded as NULL or as text"},
     {"an object with more behind it", "instance of Disk { Id = \"a\"; Inner = \"instance of Disk { }; x\"; };", 9,
-     "doc.mof:6:30: in an embedded object: found \"x\", expected the end of the embedded object"},
+     "doc.mof:6:30: in an embedded object: found \"x\", expected the end of the embedded object; correct it, or have such values "
+     "loaded as NULL or as text"},
     {"an include without folders", "#pragma include (\"a.mof\")", 9,
      "doc.mof:6:25: found an include of \"a.mof\", but no folders are given for included files; give the folder that it is in"},
 };
