@@ -18,23 +18,20 @@ namespace NORVZEL20 {
 
 using EStatus = TZELStatusCode::EStatusCode;
 
-TMofAliases::TMofAliases(TLoadContext& context, const TInMemNamespace& ns, const std::vector<TMofInstance>& instances,
+TMofAliases::TMofAliases(TLoadContext& context, const TInMemNamespace& ns, const std::vector<const TMofInstance*>& instances,
                          TMofTyping::TResolve resolve)
     : fContext(context), fNamespace(ns), fResolve(std::move(resolve))
 {
-    for (const TMofInstance& instance : instances) {
-        if (instance.alias.empty()) {
-            continue;
-        }
-        TEntry& entry = fEntries[instance.alias];
-        if (entry.instance != nullptr) {
-            const TLoadContext::TAt at(fContext, instance.place);
+    for (const TMofInstance* instance : instances) {
+        TEntry& entry = fEntries[instance->alias];
+        if (entry.instance != nullptr && entry.instance != instance) {
+            const TLoadContext::TAt at(fContext, instance->place);
             const TLoadPlace& first = entry.instance->place;
-            fContext.Fail(EStatus::kParseError, "found the alias $" + instance.alias + " a second time, after " +
+            fContext.Fail(EStatus::kParseError, "found the alias $" + instance->alias + " a second time, after " +
                                                     fContext.GetDocument(first.document) + ":" + std::to_string(first.place.line) +
                                                     "; name one of the two otherwise");
         }
-        entry.instance = &instance;
+        entry.instance = instance;
     }
 }
 

@@ -16,9 +16,9 @@ namespace NORVZEL20 {
 /// Errors: every operation fails through the context.
 class TMofAliases {
   public:
-    /// `resolve` reads aliases and instances in keys. All arguments must outlive this. Errors: kParseError (9) if two instances
-    /// have one alias.
-    TMofAliases(TLoadContext& context, const TInMemNamespace& ns, const std::vector<TMofInstance>& instances,
+    /// `instances` have aliases; one may come several times. `resolve` reads aliases and instances in keys. All arguments must
+    /// outlive this, but the vector need not. Errors: kParseError (9) if two instances have one alias.
+    TMofAliases(TLoadContext& context, const TInMemNamespace& ns, const std::vector<const TMofInstance*>& instances,
                 TMofTyping::TResolve resolve);
 
     /// The path of the instance with that alias. Errors: kNotFound (15) if there is none or its class is not declared; kParseError

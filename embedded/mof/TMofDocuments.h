@@ -14,7 +14,8 @@ namespace NORVZEL20 {
 
 class TMofReader;
 
-/// Reads MOF documents (DSP0004 2.x), each into the same load. TMofPopulator says what is read and how.
+/// Reads MOF documents (DSP0004 2.x), each into the same load. TMofPopulator says what is read and how. A file is read once,
+/// whether documents include it or it is a document itself, as far as IMofIncludes finds it.
 ///
 /// Errors of every reading: TPopulateError as TMofPopulator's, except for what only TLoadSession::Commit can know;
 /// std::bad_alloc. Threads: as the session.

@@ -43,7 +43,7 @@ const TInMemPropertyDecl* FindDecl(const TInMemClass* cls, const std::string& na
 }  // namespace
 
 TMofInstanceMaker::TMofInstanceMaker(TLoadContext& context, const TInMemNamespace& ns, IMofSink& sink,
-                                     const std::vector<TMofInstance>& instances)
+                                     const std::vector<const TMofInstance*>& instances)
     : fContext(context), fNamespace(ns), fSink(sink), fResolve([this](const TMofValue& value) { return Resolve(value); }),
       fAliases(context, ns, instances, fResolve)
 {}

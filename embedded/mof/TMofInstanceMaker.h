@@ -22,8 +22,9 @@ namespace NORVZEL20 {
 /// common.
 class TMofInstanceMaker {
   public:
-    /// `instances` are those whose aliases are known; `sink` knows the qualifiers. All arguments must outlive the maker.
-    TMofInstanceMaker(TLoadContext& context, const TInMemNamespace& ns, IMofSink& sink, const std::vector<TMofInstance>& instances);
+    /// `sink` knows the qualifiers; `instances`: see TMofAliases. All arguments must outlive the maker, but the vector need not.
+    TMofInstanceMaker(TLoadContext& context, const TInMemNamespace& ns, IMofSink& sink,
+                      const std::vector<const TMofInstance*>& instances);
 
     TDraft Make(const TMofInstance& instance);
 

@@ -10,7 +10,7 @@ struct TMofLimits {
 
     static constexpr std::size_t kMaxBytes = 256u << 20;  ///< of one document
     static constexpr std::size_t kMaxIncludeDepth = 32;   ///< documents that include each other
-    static constexpr std::size_t kMaxIncluded = 100000;   ///< documents that one document includes, with all that they include
+    static constexpr std::size_t kMaxIncluded = 100000;   ///< files that a load reads because documents include them
     static constexpr std::size_t kMaxPathDepth = 12;      ///< aliases in keys of each other's instances
 };
 

@@ -6,11 +6,13 @@
 // instances wait until the classes of all documents are declared. So do classes with a qualifier that is not declared yet, until
 // all documents have been read.
 //
-// An included document is read where the pragma stands. A file is read once, however often it is included; a file that includes
-// itself, perhaps through others, is an error.
+// An included document is read where the pragma stands. A file is read once in a session, however often it is included; a file that
+// includes itself, perhaps through others, is an error. A document knows the aliases of all files that it includes, also of those
+// that were read for an earlier document.
 #include "embedded/mof/TMofReader.h"
 
 #include <algorithm>
+#include <set>
 #include <utility>
 
 #include "embedded/load/MessageText.h"
@@ -34,11 +36,35 @@ TMofReader::TMofReader(TLoadSession& session, boost::shared_ptr<IMofIncludes> in
 void TMofReader::Read(std::string bytes, const std::string& name)
 {
     fUnits.emplace_back();
-    fIncluded.clear();
     fNamespaceName.clear();
     fHost.clear();
     fOpenFiles.clear();
+    const std::string identity = Identify(name);
+    if (!identity.empty()) {
+        if (!NoteFile(identity)) {
+            return;
+        }
+        fOpenFiles.push_back(identity);
+    }
     ReadDocument(std::move(bytes), name);
+    if (!identity.empty()) {
+        fFiles.find(identity)->second.end = fUnits.back().instances.size();
+    }
+}
+
+/// The identity of a document that others could include; empty for others.
+std::string TMofReader::Identify(const std::string& name) const
+{
+    IMofIncludes::TFile file;
+    std::string reason;
+    return fIncludes && fIncludes->Find(name.substr(name.rfind('/') + 1), name, file, reason) ? file.identity : std::string();
+}
+
+/// Notes that the file is being read for the last unit; false if it was read before.
+bool TMofReader::NoteFile(const std::string& identity)
+{
+    const std::size_t begin = fUnits.back().instances.size();
+    return fFiles.emplace(identity, TFile{fUnits.size() - 1, begin, begin, {}}).second;
 }
 
 void TMofReader::ReadDocument(std::string bytes, const std::string& name)
@@ -84,7 +110,7 @@ bool TMofReader::OnUndeclared(TMofPart part)
 void TMofReader::OnInstance(TMofInstance instance)
 {
     NoteNamespace();
-    fUnits.back().push_back(std::move(instance));
+    fUnits.back().instances.push_back(std::move(instance));
 }
 
 void TMofReader::OnPragma(const std::string& name, const std::string& text)
@@ -110,10 +136,14 @@ void TMofReader::Include(const std::string& name)
     if (std::find(fOpenFiles.begin(), fOpenFiles.end(), file.identity) != fOpenFiles.end()) {
         fContext.Fail(EStatus::kParseError, found + "which includes this document; remove one of the two");
     }
-    if (!fIncluded.insert(file.identity).second) {
+    if (!fOpenFiles.empty()) {
+        fFiles.find(fOpenFiles.back())->second.includes.push_back(file.identity);
+    }
+    if (!NoteFile(file.identity)) {
+        fUnits.back().repeated.push_back(file.identity);
         return;
     }
-    if (fOpenFiles.size() > TMofLimits::kMaxIncludeDepth || fIncluded.size() > TMofLimits::kMaxIncluded) {
+    if (fOpenNames.size() > TMofLimits::kMaxIncludeDepth + 1 || fFiles.size() > TMofLimits::kMaxIncluded) {
         fContext.Fail(EStatus::kParseError, found + "which is one too many or too deep; join some of the files");
     }
     std::string bytes;
@@ -123,6 +153,7 @@ void TMofReader::Include(const std::string& name)
     fOpenFiles.push_back(file.identity);
     ReadDocument(std::move(bytes), file.name);
     fOpenFiles.pop_back();
+    fFiles.find(file.identity)->second.end = fUnits.back().instances.size();
 }
 
 /// Forms in use: root/cimv2, /root/cimv2, //host/root/cimv2, http://host/root/cimv2, and the same with backslashes. The host "."
@@ -166,15 +197,44 @@ void TMofReader::AddClasses()
     }
 }
 
+/// The instances that aliases of the unit can name: its own, and those of files that were read for earlier ones.
+std::vector<const TMofInstance*> TMofReader::FindAliased(std::size_t unit) const
+{
+    std::vector<const TMofInstance*> aliased;
+    const auto add = [&](std::size_t from, std::size_t begin, std::size_t end) {
+        for (; begin < end; ++begin) {
+            const TMofInstance& instance = fUnits[from].instances[begin];
+            if (!instance.alias.empty()) {
+                aliased.push_back(&instance);
+            }
+        }
+    };
+    add(unit, 0, fUnits[unit].instances.size());
+    std::vector<std::string> files = fUnits[unit].repeated;
+    for (std::set<std::string> seen; !files.empty();) {
+        const std::string identity = std::move(files.back());
+        files.pop_back();
+        if (!seen.insert(identity).second) {
+            continue;
+        }
+        const TFile& file = fFiles.find(identity)->second;
+        files.insert(files.end(), file.includes.begin(), file.includes.end());
+        if (file.unit != unit) {
+            add(file.unit, file.begin, file.end);
+        }
+    }
+    return aliased;
+}
+
 /// An instance is forgotten when it is added. One with an alias is kept, because others may refer to it.
 void TMofReader::AddInstances(const TLoader::TReadObjects& readObjects)
 {
-    for (TInstances& unit : fUnits) {
-        for (const TMofInstance& instance : unit) {
+    for (std::size_t unit = 0; unit < fUnits.size(); ++unit) {
+        for (const TMofInstance& instance : fUnits[unit].instances) {
             fSession.GetLoader().FindClass(instance.className);  // perhaps the load's schema has it
         }
-        TMofInstanceMaker maker(fContext, *fSession.GetNamespace(), *this, unit);
-        for (TMofInstance& instance : unit) {
+        TMofInstanceMaker maker(fContext, *fSession.GetNamespace(), *this, FindAliased(unit));
+        for (TMofInstance& instance : fUnits[unit].instances) {
             fSession.GetLoader().FillInstance(maker.Make(instance), readObjects);
             if (instance.alias.empty()) {
                 instance = TMofInstance();

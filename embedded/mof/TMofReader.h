@@ -1,7 +1,8 @@
 #pragma once
 
 #include <boost/smart_ptr/shared_ptr.hpp>
-#include <set>
+#include <cstddef>
+#include <map>
 #include <string>
 #include <vector>
 
@@ -20,7 +21,8 @@ class TMofReader : public IMofSink, public ILateDocuments {
     /// `session` must outlive the reader. Null as `includes` refuses every include.
     TMofReader(TLoadSession& session, boost::shared_ptr<IMofIncludes> includes);
 
-    /// Reads a document with all that it includes. Aliases are known within it.
+    /// Reads a document with all that it includes. Aliases are known within it. A file is read once in a session, so a document
+    /// that is a file which another one has included is not read again.
     void Read(std::string bytes, const std::string& name);
 
     boost::shared_ptr<TInMemQualifierDecl> FindQualifierDecl(const std::string& name) override;
@@ -34,20 +36,35 @@ class TMofReader : public IMofSink, public ILateDocuments {
     void AddInstances(const TLoader::TReadObjects& readObjects) override;
 
   private:
-    using TInstances = std::vector<TMofInstance>;
+    /// The instances of a document, with those of what it includes.
+    struct TUnit {
+        std::vector<TMofInstance> instances;
+        std::vector<std::string> repeated;  // identities of the files that it includes, but that an earlier unit has read
+    };
 
+    /// A file that was read: its instances are those of a unit from `begin` to `end`.
+    struct TFile {
+        std::size_t unit;
+        std::size_t begin;
+        std::size_t end;
+        std::vector<std::string> includes;  // identities
+    };
+
+    std::string Identify(const std::string& name) const;
+    bool NoteFile(const std::string& identity);
     void ReadDocument(std::string bytes, const std::string& name);
     void Include(const std::string& name);
     void SetNamespace(std::string text);
     void NoteNamespace();
+    std::vector<const TMofInstance*> FindAliased(std::size_t unit) const;
 
     TLoadSession& fSession;
     TLoadContext& fContext;
     boost::shared_ptr<IMofIncludes> fIncludes;
-    std::vector<TInstances> fUnits;       // of each document, with what it includes
+    std::vector<TUnit> fUnits;
     std::vector<TMofPart> fParts;         // classes that wait for qualifiers
     bool fIsLast = false;                 // whether nothing more will be declared
-    std::set<std::string> fIncluded;      // identities of the included files of this unit
+    std::map<std::string, TFile> fFiles;  // by identity
     std::vector<std::string> fOpenFiles;  // identities of those that are being read
     std::vector<std::string> fOpenNames;  // of the documents that are being read
     std::string fNamespaceName;           // that the document names for what follows; empty for none

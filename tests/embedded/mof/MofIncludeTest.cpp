@@ -4,7 +4,11 @@
 #include <filesystem>
 #include <fstream>
 #include <string>
+#include <utility>
+#include <vector>
 
+#include "embedded/load/TLoadSession.h"
+#include "embedded/mof/TMofDocuments.h"
 #include "embedded/mof/TMofFolders.h"
 #include "embedded/mof/TMofPopulator.h"
 #include "tests/embedded/mof/TMofLoading.h"
@@ -73,6 +77,96 @@ TEST(MofIncludeTest, IncludesAreBounded)
     EXPECT_EQ("", loading.ErrorOf(Include("9")));
     EXPECT_EQ("32:1:22: found an include of \"33\", which is one too many or too deep; join some of the files",
               loading.ErrorOf(Include("0")));
+}
+
+/// One load of several documents that may include files.
+class MofSharedIncludeTest : public testing::Test {
+  protected:
+    MofSharedIncludeTest()
+    {
+        File("base.mof", "Qualifier Key : boolean = false, Scope(any), Flavor(DisableOverride);\n"
+                         "class Disk { [Key] string Id; Disk REF Next; };\ninstance of Disk as $A { Id = \"a\"; };\n");
+    }
+
+    void File(const std::string& name, const std::string& text) { fFiles->fTexts[name] = text; }
+
+    /// Loads the documents, "NAME" those that others may include. Returns the message if that fails, or what was tolerated.
+    std::string Load(const std::vector<std::pair<std::string, std::string>>& documents)
+    {
+        try {
+            fNamespace = TInMemNamespace::Create("root/cimv2");
+            TLoadSession session(fNamespace, "all");
+            TMofDocuments mof(session, fFiles);
+            for (const auto& [name, text] : documents) {
+                mof.ReadMemory(text.data(), text.size(), name);
+            }
+            fReport = session.Commit();
+            return TMofLoading::Tolerated(fReport);
+        } catch (const TPopulateError& error) {
+            return error.what();
+        }
+    }
+    std::string NextOf(const std::string& id) const
+    {
+        return fNamespace->GetInstance(TCIMReference::Parse("Disk.Id=\"" + id + "\""), TCallContext())
+            ->GetProperty("Next", TCallContext())
+            ->GetValue(TCallContext())
+            .ToText();
+    }
+
+    boost::shared_ptr<TMofFiles> fFiles = boost::make_shared<TMofFiles>();
+    boost::shared_ptr<TInMemNamespace> fNamespace;
+    TLoadReport fReport;
+};
+
+const std::string kB = "instance of Disk { Id = \"b\"; Next = $A; };";
+const std::string kC = "instance of Disk { Id = \"c\"; Next = $A; };";
+
+TEST_F(MofSharedIncludeTest, AFileThatTwoDocumentsIncludeIsReadOnce)
+{
+    EXPECT_EQ("", Load({{"1", Include("base.mof") + kB}, {"2", Include("base.mof") + kC}}));
+    EXPECT_EQ(3u, fReport.instances);
+    EXPECT_EQ("Disk.Id=\"a\"", NextOf("b"));
+    EXPECT_EQ("Disk.Id=\"a\"", NextOf("c"));
+}
+
+TEST_F(MofSharedIncludeTest, ADocumentThatAnotherOneIncludesIsReadOnceInAnyOrder)
+{
+    const std::pair<std::string, std::string> base{"base.mof", fFiles->fTexts["base.mof"]};
+    const std::pair<std::string, std::string> other{"1", Include("base.mof") + kB};
+    for (const auto& documents : {std::vector{base, other}, std::vector{other, base}}) {
+        EXPECT_EQ("", Load(documents));
+        EXPECT_EQ(2u, fReport.instances);
+        EXPECT_EQ("Disk.Id=\"a\"", NextOf("b"));
+    }
+}
+
+/// The second document includes what includes the file, and all of that was read for the first one.
+TEST_F(MofSharedIncludeTest, AliasesAreKnownThroughOtherFiles)
+{
+    File("through.mof", Include("base.mof"));
+    EXPECT_EQ("", Load({{"1", Include("base.mof") + Include("through.mof") + kB}, {"2", Include("through.mof") + kC}}));
+    EXPECT_EQ("Disk.Id=\"a\"", NextOf("c"));
+    EXPECT_EQ("", Load({{"1", Include("base.mof")}, {"2", Include("through.mof")}, {"3", Include("through.mof") + kC}}));
+    EXPECT_EQ("Disk.Id=\"a\"", NextOf("c"));
+}
+
+TEST_F(MofSharedIncludeTest, TheAliasesOfAnotherDocumentAreNot)
+{
+    const std::string own = "instance of Disk as $Own { Id = \"o\"; };";
+    EXPECT_EQ(
+        "2:2:30: found the alias $Own, but no instance of the document has it; declare one \"as $Own\"",
+        Load({{"1", Include("base.mof") + own}, {"2", Include("base.mof") + "instance of Disk { Id = \"c\"; Next = $Own; };"}}));
+    EXPECT_EQ("base.mof:3:1: found the alias $A a second time, after 2:2; name one of the two otherwise",
+              Load({{"1", Include("base.mof")}, {"2", Include("base.mof") + "instance of Disk as $A { Id = \"c\"; };"}}));
+}
+
+TEST_F(MofSharedIncludeTest, ADocumentThatIncludesItselfIsACircle)
+{
+    File("self.mof", Include("through.mof"));
+    File("through.mof", Include("self.mof"));
+    EXPECT_EQ("through.mof:1:28: found an include of \"self.mof\", which includes this document; remove one of the two",
+              Load({{"self.mof", fFiles->fTexts["self.mof"]}}));
 }
 
 /// Folders and files on disk, removed with this object:
@@ -171,6 +265,21 @@ TEST_F(MofFoldersTest, ALinkThatReplacesAFileIsNotFollowed)
     std::filesystem::create_symlink("../../secret.mof", fRoot + "given/sub/part.mof");
     EXPECT_FALSE(fFolders->Read(file, 1000, bytes, reason));
     EXPECT_EQ(0u, reason.find("which cannot be opened: ")) << reason;
+}
+
+TEST_F(MofFoldersTest, ADocumentIsTheFileOfItsName)
+{
+    fFolders->Add(fRoot + "given/./");
+    Write("given/main.mof", Include("sub/part.mof"));
+    Write("given/twice.mof", Include("link.mof") + "class Other { };");
+    TLoadSession session(TInMemNamespace::Create("root/cimv2"), "all");
+    TMofDocuments mof(session, fFolders);
+    for (const char* name : {"given/main.mof", "given/sub/part.mof", "given/twice.mof", "given/link.mof", "secret.mof"}) {
+        mof.ReadFile(fRoot + name);
+    }
+    const TLoadReport report = session.Commit();
+    EXPECT_EQ(3u, report.classes);
+    EXPECT_EQ("", TMofLoading::Tolerated(report));
 }
 
 TEST_F(MofFoldersTest, TheFileItselfIsReadFromAnyPlace)
