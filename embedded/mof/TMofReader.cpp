@@ -110,6 +110,9 @@ bool TMofReader::OnUndeclared(TMofPart part)
 void TMofReader::OnInstance(TMofInstance instance)
 {
     NoteNamespace();
+    if (fContext.GetOptions().takesDeclarationsOnly) {
+        return fContext.GetContents().NoteObject();
+    }
     fUnits.back().instances.push_back(std::move(instance));
 }
 

@@ -106,6 +106,23 @@ TEST_F(MofSessionTest, TheSameAliasMayBeInSeveralDocuments)
     EXPECT_EQ("sda 7 NULL NULL \nsdb 7 NULL NULL \nsdc 7 Disk.Id=\"sdb\" NULL \n", Disks());
 }
 
+/// Neither what an instance refers to nor what it says is looked at.
+TEST(MofPopulatorTest, ALoadOfDeclarationsLeavesInstancesOut)
+{
+    TLoadOptions options;
+    options.takesDeclarationsOnly = true;
+    for (const std::string& instances : {kSda, std::string("instance of Disk { Id = $None; Bogus = 1; };\ninstance of None { };"),
+                                         kSda + kSda, std::string("instance of Disk { Size = 300; };")}) {
+        const boost::shared_ptr<TInMemNamespace> ns = TInMemNamespace::Create("root/cimv2");
+        TLoadSession session(ns, "all", options);
+        const std::string document = instances + kKey + kDisk;
+        TMofDocuments(session).ReadMemory(document.data(), document.size(), "doc.mof");
+        const TLoadReport report = session.Commit();
+        EXPECT_EQ(1u, report.classes) << instances;
+        EXPECT_EQ(0u, report.instances) << instances;
+    }
+}
+
 TEST(MofPopulatorTest, KeptElementsAreClassesThenInstances)
 {
     TMofPopulator populator(TInMemNamespace::Create("root/cimv2"));
