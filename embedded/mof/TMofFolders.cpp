@@ -71,10 +71,14 @@ void OpenWithoutLinks(const std::string& path, TDescriptor& descriptor)
 
 void TMofFolders::Add(const std::string& folder)
 {
-    const std::string root = Resolve(folder.empty() ? "." : folder);
-    if (!root.empty()) {
+    std::string root = Resolve(folder.empty() ? "." : folder);
+    if (root.empty()) {
+        return;
+    }
+    root += root.back() == '/' ? "" : "/";
+    if (std::find(fRoots.begin(), fRoots.end(), root) == fRoots.end()) {
         fFolders.push_back(folder.empty() || folder.back() == '/' ? folder : folder + '/');
-        fRoots.push_back(root.back() == '/' ? root : root + '/');
+        fRoots.push_back(root);
     }
 }
 

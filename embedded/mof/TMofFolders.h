@@ -1,5 +1,6 @@
 #pragma once
 
+#include <cstddef>
 #include <string>
 #include <vector>
 
@@ -14,8 +15,9 @@ namespace NORVZEL20 {
 /// a place within one of the folders. Slashes and backslashes separate folders. Errors: std::bad_alloc only.
 class CIMDELTA_EXPORT TMofFolders : public IMofIncludes {
   public:
-    /// Adds a folder with all that is below it. A folder that is not there has no files.
+    /// Adds a folder with all that is below it. A folder that is not there, or that was added before, adds nothing.
     void Add(const std::string& folder);
+    std::size_t CountFolders() const noexcept { return fFolders.size(); }
 
     bool Find(const std::string& name, const std::string& from, TFile& file, std::string& reason) override;
     bool Read(const TFile& file, std::size_t most, std::string& bytes, std::string& reason) override;

@@ -243,6 +243,17 @@ TEST_F(MofFoldersTest, NothingElseMayBeIncluded)
     }
 }
 
+TEST_F(MofFoldersTest, AFolderIsAddedOnce)
+{
+    EXPECT_EQ(2u, fFolders->CountFolders());
+    for (const char* name : {"given", "given/", "given/sub/..", "second/../given/away/given"}) {
+        fFolders->Add(fRoot + name);
+        EXPECT_EQ(2u, fFolders->CountFolders()) << name;
+    }
+    fFolders->Add(fRoot + "given/sub");
+    EXPECT_EQ(3u, fFolders->CountFolders());
+}
+
 TEST_F(MofFoldersTest, AFileThatHasTooManyBytesIsRefused)
 {
     IMofIncludes::TFile file;
