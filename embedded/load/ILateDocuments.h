@@ -4,7 +4,8 @@
 
 namespace NORVZEL20 {
 
-/// Documents that were read, but of which something waits for other documents of the load: see TLoadSession::AddLate.
+/// Documents that were read, but of which something waits for other documents of the load: see TLoadSession::AddLate. Of MOF,
+/// these are all instances, and classes with a qualifier that was not declared in front of them.
 class ILateDocuments {
   public:
     virtual ~ILateDocuments() = default;

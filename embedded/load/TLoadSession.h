@@ -21,11 +21,11 @@ class TLoader;
 
 /// One load of one or more documents into a namespace: all of them, or nothing.
 ///
-/// Order: begin a session, let TCimXmlDocuments read into it, and call Commit. The documents may come in any order: what one
-/// of them declares, the others may use, and the rules for references within a document hold for all documents together.
-/// All or nothing: if the session ends without Commit, or Commit throws, the namespace is as it was. After any exception, the
-/// session can only be destroyed.
-/// Threads: use a session, and its namespace, from one thread at a time.
+/// Order: begin a session, let the readers of documents (TCimXmlDocuments, TMofDocuments) read into it, and call Commit. The
+/// documents may come in any order: what one of them declares, the others may use, and the rules for references within a document
+/// hold for all documents together. All or nothing: if the session ends without Commit, or Commit throws, the namespace is as it
+/// was. After any exception, the session can only be destroyed. Threads: use a session, and its namespace, from one thread at a
+/// time.
 class CIMDELTA_EXPORT TLoadSession {
   public:
     /// Returns the value, with those of its texts read that are embedded objects.
@@ -45,8 +45,9 @@ class CIMDELTA_EXPORT TLoadSession {
     /// TCimXmlPopulator.
     TLoadReport Commit();
 
-    /// The classes, then the instances, each in the order of the documents. Empty without KeepElements, before Commit and when
-    /// called again.
+    /// The classes, then the instances, each in the order in which they were added: that of the documents, except for what waits
+    /// for other documents (see ILateDocuments), which comes behind all others. Empty without KeepElements, before Commit and
+    /// when called again.
     std::vector<boost::shared_ptr<ICIMElement>> TakeElements();
 
     /// For the readers of documents: what they add to, and how values are read whose class a later document declares.

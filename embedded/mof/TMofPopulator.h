@@ -47,8 +47,8 @@ class CIMDELTA_EXPORT TMofPopulator {
 
     /// From now on remembers what each load adds, for TakeElements.
     void KeepElements() { fKeep = true; }
-    /// The classes, then the instances of the last load that did not fail, each in the document's order. Empty without KeepElements
-    /// and when called again.
+    /// The classes, then the instances of the last load that did not fail, each in the document's order, except that classes with a
+    /// qualifier that is declared behind them come last. Empty without KeepElements and when called again.
     std::vector<boost::shared_ptr<ICIMElement>> TakeElements();
 
   private:
