@@ -57,7 +57,7 @@ void TClassQueue::NoteRepeated(const std::string& name)
     fContext.Tolerate("repeated class", "class " + Quote(name) + " is declared again; the first declaration stands");
 }
 
-/// Whether two declarations say the same can be told when the class has its superclass: one may repeat what it inherits.
+/// Two declarations can be compared only when the class has its superclass, because one may repeat what it inherits.
 void TClassQueue::CheckRepeated()
 {
     for (const TDraft& draft : std::exchange(fRepeated, {})) {

@@ -24,7 +24,7 @@ struct TLoadReport {
         kFromDocuments,   ///< they name it themselves
         kFromReferences,  ///< all references that name a namespace name this one
         kFromOptions,     ///< TLoadOptions::namespaceName
-        kFromDefault      ///< nothing tells
+        kFromDefault      ///< none of these names one
     };
 
     /// A class that was declared as its instances suggest.
