@@ -40,7 +40,6 @@ void TLoadContents::EndAnswer()
     }
     fOpened += isFirst ? 1 : 0;
     fEnded += fIsEnd ? 1 : 0;
-    fIsLastEnded = fIsEnd;
     if (!fIsEnd) {
         fUnfinished = TFault{"found an answer to " + Quote(fOperation) +
                                  " that does not end its sequence (EndOfSequence is not TRUE), but not the ones after it; pull"

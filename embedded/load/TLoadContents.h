@@ -13,7 +13,8 @@ namespace NORVZEL20 {
 /// empty load would look like an inventory without instances.
 ///
 /// A server gives many instances in several answers: one to an Open operation and those to Pull operations, of which the last one
-/// says that it ends the sequence. If that one is missing, instances are missing too.
+/// says that it ends the sequence. If that one is missing, instances are missing too. The answers may come in any order, since
+/// folders sort 10 in front of 2; if none is to an Open operation, one end is enough.
 class TLoadContents {
   public:
     /// A class, an instance or the declaration of a qualifier.
@@ -34,7 +35,7 @@ class TLoadContents {
     std::optional<TFault> FindFault() const;
 
   private:
-    bool IsUnfinished() const noexcept { return fOpened > 0 ? fEnded < fOpened : fUnfinished && !fIsLastEnded; }
+    bool IsUnfinished() const noexcept { return fOpened > 0 ? fEnded < fOpened : fUnfinished && fEnded == 0; }
 
     bool fHasObjects = false;
     std::optional<TFault> fOther;       // the first thing that is no object
@@ -44,7 +45,6 @@ class TLoadContents {
     bool fIsEnd = false;                // that answer ends its sequence
     std::size_t fOpened = 0;            // sequences whose first answer was read
     std::size_t fEnded = 0;             // sequences whose last answer was read
-    bool fIsLastEnded = false;          // the last answer of a sequence that was read ends it
     std::optional<TFault> fUnfinished;  // the last answer that does not end its sequence
 };
 
