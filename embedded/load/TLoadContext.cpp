@@ -160,17 +160,32 @@ void TLoadContext::NoteNamespace(const std::string& name, const std::string& hos
         fReport.namespaceOrigin = TLoadReport::kFromDocuments;
         fReport.namespaceName = name;
     }
+    fNamespacePlace = fNamespacePlace ? fNamespacePlace : GetPlace();
     if (!TNameText::Equal(name, fReport.namespaceName)) {
-        Fail(TZELStatusCode::kParseError, "found namespace " + Quote(name) + " after " + Quote(fReport.namespaceName) +
-                                              "; a document holds one namespace, so split this one");
+        FailSecond("namespace", name, fReport.namespaceName, *fNamespacePlace);
+    }
+    if (host.empty()) {
+        return;
     }
     if (fReport.host.empty()) {
         fReport.host = host;
+        fHostPlace = GetPlace();
     }
-    if (!host.empty() && !TNameText::Equal(host, fReport.host)) {
+    if (!TNameText::Equal(host, fReport.host)) {
+        FailSecond("host", host, fReport.host, fHostPlace);
+    }
+}
+
+void TLoadContext::FailSecond(const std::string& what, const std::string& name, const std::string& first,
+                              const TLoadPlace& firstPlace) const
+{
+    const std::string found = "found " + what + " " + Quote(name);
+    if (GetPlace().document == firstPlace.document) {
         Fail(TZELStatusCode::kParseError,
-             "found host " + Quote(host) + " after " + Quote(fReport.host) + "; a document comes from one host, so split this one");
+             found + " after " + Quote(first) + "; a document holds one " + what + ", so split this one");
     }
+    Fail(TZELStatusCode::kParseError, found + ", but " + Quote(first) + " at " + Describe(firstPlace) +
+                                          "; an inventory holds one " + what + ", so load the two documents as two inventories");
 }
 
 void TLoadContext::CheckContents()

@@ -163,14 +163,18 @@ class CIMDELTA_INTERNAL_EXPORT TLoadContext {
     };
 
     bool HasRefused() const noexcept { return fOptions.badValues == EBadValues::kRefuse && fBadValues.HasAny(); }
+    [[noreturn]] void FailSecond(const std::string& what, const std::string& name, const std::string& first,
+                                 const TLoadPlace& firstPlace) const;
     [[noreturn]] void FailForBadValues(bool isWhole) const;
     [[noreturn]] void Throw(TZELStatusCode::EStatusCode status, const std::string& message, const TLoadPlace& place,
                             EAdvice advice) const;
 
-    std::vector<std::string> fDocuments;  // their names
-    std::vector<TOpen> fOpen;             // the innermost document comes last
-    TLoadPlace fEnd;                      // of the document that was ended last
-    std::optional<TLoadPlace> fPlace;     // of the innermost TAt
+    std::vector<std::string> fDocuments;        // their names
+    std::vector<TOpen> fOpen;                   // the innermost document comes last
+    TLoadPlace fEnd;                            // of the document that was ended last
+    std::optional<TLoadPlace> fPlace;           // of the innermost TAt
+    std::optional<TLoadPlace> fNamespacePlace;  // where the documents first name their namespace
+    TLoadPlace fHostPlace;                      // likewise their host
     TLoadReport fReport;
     TOwnPlaceSearch fOwnPlace{fReport};
     TBadValues fBadValues{fReport.badProperties};

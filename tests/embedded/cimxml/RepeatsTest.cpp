@@ -260,5 +260,29 @@ TEST_F(RepeatsTest, AKeyWithoutANameIsTheOnlyOne)
     EXPECT_NE(std::string::npos, Outcome({document("b")}).find("found \"a\" in the key \"Id\""));
 }
 
+TEST_F(RepeatsTest, AnotherNamespaceOrHostInAnotherDocumentNamesBothPlaces)
+{
+    const auto named = [](const std::string& host, const std::string& ns) {
+        return "<NAMESPACEPATH><HOST>" + host + "</HOST><LOCALNAMESPACEPATH><NAMESPACE NAME=\"" + ns +
+               "\"/></LOCALNAMESPACEPATH></NAMESPACEPATH>";
+    };
+    const auto document = [&](const std::string& host, const std::string& ns) {
+        return "<CIM><DECLARATION><DECLGROUP.WITHPATH><VALUE.OBJECTWITHPATH><INSTANCEPATH>" + named(host, ns) +
+               "<INSTANCENAME CLASSNAME=\"Disk\"/></INSTANCEPATH><INSTANCE CLASSNAME=\"Disk\">" + L::Property("Id", "string", ns) +
+               "</INSTANCE></VALUE.OBJECTWITHPATH></DECLGROUP.WITHPATH></DECLARATION></CIM>";
+    };
+    const auto expect = [](const std::string& what, const std::string& found) {
+        EXPECT_NE(std::string::npos, found.find("c.xml:1:")) << found;
+        EXPECT_NE(std::string::npos,
+                  found.find("found " + what + "2\", but \"" + what.substr(what.find('"') + 1) + "1\" at b.xml:1:"))
+            << found;
+        EXPECT_NE(std::string::npos, found.find("; an inventory holds one " + what.substr(0, what.find(' ')) +
+                                                ", so load the two documents as two inventories"))
+            << found;
+    };
+    expect("namespace \"n", Outcome({fDisk, document("h1", "n1"), document("h1", "n2")}));
+    expect("host \"h", Outcome({fDisk, document("h1", "n1"), document("h2", "n1")}));
+}
+
 }  // namespace
 }  // namespace NORVZEL20
