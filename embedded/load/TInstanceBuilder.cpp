@@ -114,10 +114,14 @@ void TInstanceBuilder::SetBad(const TLoadTarget& target, const TBadValue& bad)
         fContext.FailBadKey(bad, fLayout->cls->GetName(), *target.name);
     }
     fContext.NoteBadValue(bad, fLayout->cls->GetName(), *target.name, true);
-    TCIMValue value = isNull ? TCIMValue::Null(target.type) : decl.IsBag() ? bad.value.AsBag() : bad.value;
+    TCIMValue text = decl.IsBag() ? bad.value.AsBag() : bad.value;
+    TCIMValue value = isNull ? TCIMValue::Null(target.type) : text;
     if (target.isStatic) {
         SetStatic(target, value, isNull);
     } else {
+        if (isNull) {
+            fRepeats.NoteLost(*fInstance, target.slot, std::move(text));
+        }
         fInstance->Change(target.slot, std::move(value));  // text does not fit the slot either
     }
 }

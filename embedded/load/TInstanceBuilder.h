@@ -14,6 +14,7 @@
 #include "embedded/load/TLateInstances.h"
 #include "embedded/load/TLoadLayout.h"
 #include "embedded/load/TLoadTarget.h"
+#include "embedded/load/TRepeatedInstances.h"
 
 namespace NORVZEL20 {
 
@@ -28,9 +29,9 @@ class TInstanceBuilder {
     using TReadObjects = boost::function<TCIMValue(const TCIMValue&)>;
 
     /// All arguments must outlive the builder.
-    TInstanceBuilder(TLoadContext& context, TInMemNamespace& ns, TInMemStaging& staging, TClassQueue& classes,
-                     TLateInstances& late) noexcept
-        : fContext(context), fNamespace(ns), fStaging(staging), fClasses(classes), fLate(late)
+    TInstanceBuilder(TLoadContext& context, TInMemNamespace& ns, TInMemStaging& staging, TClassQueue& classes, TLateInstances& late,
+                     TRepeatedInstances& repeats) noexcept
+        : fContext(context), fNamespace(ns), fStaging(staging), fClasses(classes), fLate(late), fRepeats(repeats)
     {}
 
     /// Starts an instance; false if its class is not known yet.
@@ -96,6 +97,7 @@ class TInstanceBuilder {
     TInMemStaging& fStaging;
     TClassQueue& fClasses;
     TLateInstances& fLate;
+    TRepeatedInstances& fRepeats;
     TNameMap<std::unique_ptr<TLoadLayout>> fLayouts;  // by class name
     TLoadLayout* fLayout = nullptr;                   // of the instance being filled, or of the last one
     boost::shared_ptr<TInMemInstance> fInstance;

@@ -24,7 +24,7 @@ using EStatus = TZELStatusCode::EStatusCode;
 
 TLoader::TLoader(TLoadContext& context, const boost::shared_ptr<TInMemNamespace>& ns)
     : fContext(context), fNamespace(ns), fStaging(ns), fClasses(context, *ns, fStaging), fRepeats(context),
-      fBuilder(context, *ns, fStaging, fClasses, fLate)
+      fBuilder(context, *ns, fStaging, fClasses, fLate, fRepeats)
 {
     if (fContext.GetOptions().takesDeclarationsOnly) {
         fLate.StartWaiting();  // so that all instances come to AddInstance

@@ -27,24 +27,6 @@ std::uint32_t FindFirst(const TInMemInstance& repeated)
     return repeated.GetInMemClass()->GetExtent().FindPosition(keys);
 }
 
-/// The first property in which they differ; null if they are equal. Static properties have the same value anyway.
-const TInMemPropertyDecl* FindDifference(const TInMemInstance& a, const TInMemInstance& b)
-{
-    const TInMemLayout& layout = a.GetInMemClass()->GetLayout();
-    for (const std::uint32_t slot : layout.GetOrder()) {
-        if (!layout.GetDecl(slot).IsStatic() && a.GetSlotValue(slot) != b.GetSlotValue(slot)) {
-            return &layout.GetDecl(slot);
-        }
-    }
-    return nullptr;
-}
-
-std::string ShowValue(const TInMemInstance& instance, const TInMemPropertyDecl& decl)
-{
-    const TCIMValue value = instance.GetSlotValue(instance.GetInMemClass()->GetLayout().FindSlot(decl.GetName()));
-    return value.IsNull() ? "NULL" : Quote(value.ToText());
-}
-
 }  // namespace
 
 void TRepeatedInstances::NoteAdded(const TInMemClass& cls, const TLoadPlace& place)
@@ -98,14 +80,39 @@ void TRepeatedInstances::Check()
     }
 }
 
+/// As it was written, if that did not fit its type.
+const TCIMValue& TRepeatedInstances::ValueOf(const TInMemInstance& instance, std::uint32_t slot) const
+{
+    const auto lost = fLost.empty() ? fLost.end() : fLost.find({&instance, slot});
+    return lost == fLost.end() ? instance.GetSlotValue(slot) : lost->second;
+}
+
+/// The first property in which they differ; null if they are equal. Static properties have the same value anyway.
+const TInMemPropertyDecl* TRepeatedInstances::FindDifference(const TInMemInstance& a, const TInMemInstance& b) const
+{
+    const TInMemLayout& layout = a.GetInMemClass()->GetLayout();
+    for (const std::uint32_t slot : layout.GetOrder()) {
+        if (!layout.GetDecl(slot).IsStatic() && ValueOf(a, slot) != ValueOf(b, slot)) {
+            return &layout.GetDecl(slot);
+        }
+    }
+    return nullptr;
+}
+
+std::string TRepeatedInstances::Show(const TInMemInstance& instance, const TInMemPropertyDecl& decl) const
+{
+    const TCIMValue& value = ValueOf(instance, instance.GetInMemClass()->GetLayout().FindSlot(decl.GetName()));
+    return value.IsNull() ? "NULL" : Quote(value.ToText());
+}
+
 void TRepeatedInstances::Compare(const TRepeat& repeat)
 {
     const std::string path = ShowPath(*repeat.repeated);
     if (const TInMemPropertyDecl* const decl = FindDifference(*repeat.first, *repeat.repeated)) {
-        fContext.Fail(EStatus::kAlreadyExists, "found a second instance " + path + " with " + ShowValue(*repeat.repeated, *decl) +
+        fContext.Fail(EStatus::kAlreadyExists, "found a second instance " + path + " with " + Show(*repeat.repeated, *decl) +
                                                    " in property " + Quote(decl->GetName()) + ", but the one at " +
-                                                   fContext.Describe(repeat.firstPlace) + " has " +
-                                                   ShowValue(*repeat.first, *decl) + "; remove one of the two");
+                                                   fContext.Describe(repeat.firstPlace) + " has " + Show(*repeat.first, *decl) +
+                                                   "; remove one of the two");
     }
     fContext.Tolerate("repeated instance", "instance " + path + " is there again with the same values; taken as one");
 }

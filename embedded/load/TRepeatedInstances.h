@@ -2,12 +2,16 @@
 
 #include <boost/smart_ptr/shared_ptr.hpp>
 #include <cstdint>
+#include <map>
+#include <string>
 #include <unordered_map>
 #include <unordered_set>
+#include <utility>
 #include <vector>
 
 #include "embedded/load/TLoadContext.h"
 #include "embedded/store/TInMemInstance.h"
+#include "embedded/store/TInMemPropertyDecl.h"
 
 namespace NORVZEL20 {
 
@@ -25,6 +29,12 @@ class TRepeatedInstances {
     /// The instance at the current place has the keys of another one of its class, which was added before. Errors: fails with
     /// kAlreadyExists (12) if that was there before the load, or if the class has no keys.
     void NoteRepeated(const boost::shared_ptr<TInMemInstance>& repeated);
+    /// A value that does not fit its type becomes NULL in that slot; `text` is what it was. Only equal texts are equal then. Costs
+    /// a record for each.
+    void NoteLost(const TInMemInstance& instance, std::uint32_t slot, TCIMValue text)
+    {
+        fLost.emplace(std::make_pair(&instance, slot), std::move(text));
+    }
     /// Compares what was noted. Errors: fails with kAlreadyExists (12) if one has other values than the instance added first.
     void Check();
 
@@ -51,12 +61,16 @@ class TRepeatedInstances {
 
     const TPlace* FindPlace(const TInMemClass& cls, std::uint32_t position) const;
     void Compare(const TRepeat& repeat);
+    const TInMemPropertyDecl* FindDifference(const TInMemInstance& a, const TInMemInstance& b) const;
+    const TCIMValue& ValueOf(const TInMemInstance& instance, std::uint32_t slot) const;
+    std::string Show(const TInMemInstance& instance, const TInMemPropertyDecl& decl) const;
 
     TLoadContext& fContext;
     std::unordered_map<const TInMemClass*, TPlaces> fPlaces;
     const TInMemClass* fLastClass = nullptr;
     TPlaces* fLast = nullptr;  // of that class
     std::vector<TRepeat> fRepeats;
+    std::map<std::pair<const TInMemInstance*, std::uint32_t>, TCIMValue> fLost;  // by slot
 };
 
 }  // namespace NORVZEL20

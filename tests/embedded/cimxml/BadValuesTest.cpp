@@ -438,5 +438,21 @@ TEST_F(BadValuesTest, KeptTextIsWrittenAndReadAgain)
     EXPECT_EQ("root/cimv2:K.Id=\"x\"\n", fLoading.PathsOf("K"));
 }
 
+/// Two instances that are NULL only because of what was lost are one if the same was lost.
+TEST_F(BadValuesTest, WhatWasLostStillTellsRepeatedInstancesApart)
+{
+    const std::string first = L::Instance("A", "a", L::Property("N", "uint16", "70001"));
+    const std::string other = L::Instance("A", "a", L::Property("N", "uint16", "70002"));
+    const std::string null = L::Instance("A", "a", "<PROPERTY NAME=\"N\" TYPE=\"uint16\"/>");
+    EXPECT_EQ("A.N 2: \"70001\" is no uint16, doc.xml:3:145, A.Id=\"a\"\n", Load(EBadValues::kNull, kDeclared + first + first));
+    for (const auto& [second, shown] : {std::make_pair(other, "\"70002\""), std::make_pair(null, "NULL")}) {
+        fLoading = TLoading();
+        const std::string message = Load(EBadValues::kNull, kDeclared + first + second);
+        EXPECT_NE(std::string::npos, message.find(std::string("with ") + shown + " in property \"N\", but the one at doc.xml:3:"))
+            << message;
+        EXPECT_NE(std::string::npos, message.find(" has \"70001\"; remove one of the two")) << message;
+    }
+}
+
 }  // namespace
 }  // namespace NORVZEL20
