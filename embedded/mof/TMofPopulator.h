@@ -24,13 +24,13 @@ namespace NORVZEL20 {
 /// a text that is MOF in a property with EmbeddedObject or EmbeddedInstance, becomes an embedded object.
 /// References: aliases of the same document, and paths as texts. They are stored as TCimXmlPopulator stores them. The namespace is
 /// that of `#pragma namespace` in front of the first instance.
-/// Includes: `#pragma include` reads a file that IMofIncludes finds, in its place, each file once. A file that includes itself is
-/// an error. All other pragmas are ignored. All or nothing: if a load throws, the namespace is as it was. Errors of every load:
-/// TPopulateError with the statuses of TNamespacePopulator::PopulateFromXMLFile, kFileError (11) for a file that cannot be read, or
-/// kNotSupported (31) if the namespace is not one of the provider "inmem"; std::bad_alloc. Nothing is logged. Threads: as
-/// TCimXmlPopulator. Cost: one pass over each document, which is held whole while it is read. Instances take several times the
-/// memory of their text until the load ends. Bounds: those of TMofLimits and TSchemaLimits; 32 embedded objects inside of each
-/// other. A document that exceeds one is refused with kParseError (9).
+/// Includes: `#pragma include` reads a file that IMofIncludes finds, in its place, each file once. A file that includes itself, or
+/// that is compressed, is an error. All other pragmas are ignored. All or nothing: if a load throws, the namespace is as it was.
+/// Errors of every load: TPopulateError with the statuses of TNamespacePopulator::PopulateFromXMLFile, kFileError (11) for a file
+/// that cannot be read, or kNotSupported (31) if the namespace is not one of the provider "inmem"; std::bad_alloc. Nothing is
+/// logged. Threads: as TCimXmlPopulator. Cost: one pass over each document, which is held whole while it is read. Instances take
+/// several times the memory of their text until the load ends. Bounds: those of TMofLimits and TSchemaLimits; 32 embedded objects
+/// inside of each other. A document that exceeds one is refused with kParseError (9).
 class CIMDELTA_EXPORT TMofPopulator {
   public:
     using TPullSource = TMofDocuments::TPullSource;

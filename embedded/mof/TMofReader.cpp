@@ -12,7 +12,9 @@
 #include "embedded/mof/TMofReader.h"
 
 #include <algorithm>
+#include <iterator>
 #include <set>
+#include <string_view>
 #include <utility>
 
 #include "embedded/load/MessageText.h"
@@ -28,6 +30,18 @@
 namespace NORVZEL20 {
 
 using EStatus = TZELStatusCode::EStatusCode;
+
+namespace {
+
+/// Whether the bytes begin as those of gzip, xz, zstd or bzip2 do. No MOF begins so.
+bool AreCompressed(const std::string& bytes)
+{
+    constexpr std::string_view kBeginnings[] = {"\x1f\x8b", "\xfd\x37zXZ", "\x28\xb5\x2f\xfd", "BZh"};
+    return std::any_of(std::begin(kBeginnings), std::end(kBeginnings),
+                       [&](std::string_view beginning) { return bytes.compare(0, beginning.size(), beginning) == 0; });
+}
+
+}  // namespace
 
 TMofReader::TMofReader(TLoadSession& session, boost::shared_ptr<IMofIncludes> includes)
     : fSession(session), fContext(session.GetContext()), fIncludes(std::move(includes))
@@ -152,6 +166,9 @@ void TMofReader::Include(const std::string& name)
     std::string bytes;
     if (!fIncludes->Read(file, TMofLimits::kMaxBytes, bytes, reason)) {
         fContext.Fail(EStatus::kFileError, found + reason);
+    }
+    if (AreCompressed(bytes)) {
+        fContext.Fail(EStatus::kParseError, found + "which is compressed; included files must be plain, so decompress it");
     }
     fOpenFiles.push_back(file.identity);
     ReadDocument(std::move(bytes), file.name);

@@ -67,6 +67,18 @@ TEST(MofIncludeTest, ACircleIsAnError)
               loading.ErrorOf(Include("self.mof")));
 }
 
+TEST(MofIncludeTest, ACompressedFileIsRefused)
+{
+    for (const std::string& bytes : {std::string("\x1f\x8b\x08\0\0", 5), std::string("\xfd\x37zXZ\0", 6),
+                                     std::string("\x28\xb5\x2f\xfd\x04\0", 6), std::string("BZh91AY")}) {
+        TMofLoading loading;
+        loading.File("base.mof", bytes);
+        EXPECT_EQ(
+            "doc.mof:1:28: found an include of \"base.mof\", which is compressed; included files must be plain, so decompress it",
+            loading.ErrorOf(Include("base.mof")));
+    }
+}
+
 TEST(MofIncludeTest, IncludesAreBounded)
 {
     TMofLoading loading;
