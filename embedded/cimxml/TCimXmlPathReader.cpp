@@ -273,6 +273,7 @@ TCIMValue TCimXmlPathReader::SettleBadKey(const TBadValue& bad)
         fContext.FailBadKey(bad, frame.className, frame.keyName);
     }
     fContext.NoteBadValue(bad, frame.className, frame.keyName, true);
+    fContext.GetBadValues().NoteKey();
     return bad.value;
 }
 

@@ -72,7 +72,8 @@ std::string TBadValues::Describe(bool isWhole) const
         text += std::string(isWhole ? "; " : "; at least ") + std::to_string(others) + " more " +
                 (others == 1 ? "value does not fit its type" : "values do not fit their types");
     }
-    return text + (others > 0 ? "; correct them" : "; correct it") + ", or have such values loaded as NULL or as text";
+    return text + (others > 0 ? "; correct them" : "; correct it") + ", or have such values loaded as " +
+           (fHasKey ? "text" : "NULL or as text");
 }
 
 }  // namespace NORVZEL20

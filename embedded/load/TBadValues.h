@@ -28,6 +28,9 @@ class TBadValues {
     std::size_t GetMark() const noexcept { return fEmbedded.size(); }
     /// Uncounts the embedded values since the mark. Call it only if no others were counted since then.
     void TakeBack(std::size_t mark) noexcept;
+    /// Says that one of the values is that of a key, which cannot be NULL.
+    void NoteKey() noexcept { fHasKey = true; }
+    bool HasKey() const noexcept { return fHasKey; }
     bool HasAny() const noexcept { return !fFound.empty(); }
 
     /// Whether records still lack the instance that their first value stands in.
@@ -46,6 +49,7 @@ class TBadValues {
     std::map<std::pair<std::string, std::string>, std::size_t> fPositions;  // in fFound, by class and property
     std::vector<std::size_t> fNameless;                                     // positions in fFound
     std::vector<std::size_t> fEmbedded;                                     // likewise, of each embedded value
+    bool fHasKey = false;
 };
 
 }  // namespace NORVZEL20

@@ -114,6 +114,9 @@ void TInstanceBuilder::SetBad(const TLoadTarget& target, const TBadValue& bad)
         fContext.FailBadKey(bad, fLayout->cls->GetName(), *target.name);
     }
     fContext.NoteBadValue(bad, fLayout->cls->GetName(), *target.name, true);
+    if (decl.IsKey()) {
+        fContext.GetBadValues().NoteKey();
+    }
     TCIMValue text = decl.IsBag() ? bad.value.AsBag() : bad.value;
     TCIMValue value = isNull ? TCIMValue::Null(target.type) : text;
     if (target.isStatic) {

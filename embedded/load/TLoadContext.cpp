@@ -104,7 +104,7 @@ void TLoadContext::FailForBadValues(bool isWhole) const
 {
     const TBadProperty& first = fReport.badProperties.front();
     throw TPopulateError(TZELStatusCode::kTypeMismatch, fBadValues.Describe(isWhole), first.document, first.line, first.column,
-                         EAdvice::kLetBadValuesPass);
+                         fBadValues.HasKey() ? EAdvice::kKeepBadValuesAsText : EAdvice::kLetBadValuesPass);
 }
 
 void TLoadContext::EnterEmbeddedObject()

@@ -46,6 +46,9 @@ TEST_F(BadValuesTest, AKeyIsRefusedWithTheOptionThatHelps)
               "correct "
               "it, or have such values loaded as text with --bad-values text\n",
               Compare({contents, contents}, {"--bad-values", "null"}));
+    EXPECT_EQ("cimdelta: a.xml:5:89: found \"300\" in property \"Number\" of class \"Port\", expected a uint8 (instance "
+              "Port.Number=\"300\"); correct it, or have such values loaded as text with --bad-values text\n",
+              Compare({contents, contents}));
     EXPECT_EQ("No differences in what was compared between a and b; not everything was, see below.",
               Compare({contents, contents}, {"--bad-values", "text"}).substr(0, 83));
     EXPECT_EQ(0, fStatus);

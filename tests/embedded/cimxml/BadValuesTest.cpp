@@ -220,8 +220,9 @@ TEST_F(BadValuesTest, AKeyIsKeptAsText)
     fLoading = TLoading();
     EXPECT_EQ(
         "13 doc.xml:3:85: found \"70000\" in property \"Id\" of class \"K\", expected a uint16 (instance K.Id=\"70000\"); 1 more "
-        "value does not fit its type; correct them, or have such values loaded as NULL or as text",
+        "value does not fit its type; correct them, or have such values loaded as text",
         Load(EBadValues::kRefuse, contents));
+    EXPECT_EQ(EAdvice::kKeepBadValuesAsText, fAdvice);
 }
 
 TEST_F(BadValuesTest, TwoInstancesWithTheSameTextAsKeyAreTheSame)

@@ -75,8 +75,7 @@ const TDeclarationRow kRefusedRows[] = {
      L::Group(Referring("<INSTANCENAME CLASSNAME=\"X\"><KEYBINDING NAME=\"K\"><KEYVALUE VALUETYPE=\"numeric\">many</KEYVALUE>"
                         "</KEYBINDING></INSTANCENAME>")),
      "doc.xml:3:229: found \"many\" in property \"K\" of class \"X\", expected a number (instance A.Id=\"1\"); correct it, or have "
-     "such "
-     "values loaded as NULL or as text"},
+     "such values loaded as text"},
     {"two objects in one", L::Group("<VALUE.OBJECT><CLASS NAME=\"A\"/><CLASS NAME=\"B\"/></VALUE.OBJECT>"),
      "doc.xml:2:32: found a second object where one is expected"},
     {"a long name, cut between characters", L::Group(L::Instance(LongName(401), "1")),
