@@ -1,6 +1,5 @@
 #include <gtest/gtest.h>
 
-#include <sstream>
 #include <string>
 #include <vector>
 
@@ -347,57 +346,6 @@ TEST_F(BadValuesTest, AnEmbeddedObjectThatCannotBeReadIsOne)
     fLoading = TLoading();
     Load(EBadValues::kNull, contents);
     EXPECT_EQ("string NULL", Stored("1", "E"));
-}
-
-/// The object is discarded with the values in it.
-TEST_F(BadValuesTest, WhatIsInsideOfABadObjectDoesNotCount)
-{
-    const std::string broken = kInner.substr(0, kInner.rfind("&lt;/INSTANCE")) + "&lt;oops/&gt;";
-    const auto array = [](const std::vector<std::string>& texts) {
-        std::string elements = Array("E", "string", texts);
-        return elements.insert(elements.find(" TYPE"), " EmbeddedObject=\"instance\"");
-    };
-    const std::string arrays = L::Class("A", "<PROPERTY.ARRAY NAME=\"E\" TYPE=\"string\"/>");
-    const struct {
-        const char* what;
-        std::string contents;
-        std::string found;
-    } rows[] = {
-        {"at the start", kHolder + L::Instance("A", "1", Embedded(broken)), "A.E 1"},
-        {"behind another one",
-         kHolder + L::Instance("A", "1", Embedded(kInner)) + L::Instance("A", "2", Embedded(broken)) +
-             L::Instance("A", "3", Embedded(kInner)),
-         "B.N 2 A.E 1"},
-        {"in front of one", kHolder + L::Instance("A", "1", Embedded(broken)) + L::Instance("A", "2", Embedded(kInner)),
-         "A.E 1 B.N 1"},
-        {"element of an array", arrays + L::Instance("A", "1", array({kInner, broken, kInner})), "A.E 1"},
-        {"array behind another one",
-         arrays + L::Instance("A", "1", array({kInner, kInner})) + L::Instance("A", "2", array({kInner, broken})), "B.N 2 A.E 1"},
-        {"array in front of its class", L::Instance("A", "1", array({kInner, broken})) + arrays, "A.E 1"},
-    };
-    for (const auto& row : rows) {
-        for (const EBadValues choice : {EBadValues::kNull, EBadValues::kText}) {
-            fLoading = TLoading();
-            std::istringstream lines(Load(choice, row.contents));
-            std::string found;
-            for (std::string line; std::getline(lines, line);) {
-                found += (found.empty() ? "" : " ") + line.substr(0, line.find(':'));
-            }
-            EXPECT_EQ(row.found, found) << row.what;
-        }
-    }
-}
-
-/// The class, which comes last, says that the texts are objects.
-TEST_F(BadValuesTest, NorInAnArrayThatIsReadAtTheEnd)
-{
-    const std::string broken = kInner.substr(0, kInner.rfind("&lt;/INSTANCE")) + "&lt;oops/&gt;";
-    const std::string contents =
-        L::Instance("A", "1", Array("E", "string", {kInner, broken})) +
-        L::Class("A", "<PROPERTY.ARRAY NAME=\"E\" TYPE=\"string\"><QUALIFIER NAME=\"EmbeddedInstance\" TYPE=\"string\">"
-                      "<VALUE>B</VALUE></QUALIFIER></PROPERTY.ARRAY>");
-    const std::string found = Load(EBadValues::kText, contents);
-    EXPECT_EQ("A.E 1", found.substr(0, found.find(':')));
 }
 
 /// The class, which comes last, says that the text is an object.
