@@ -129,6 +129,9 @@ bool TXmlReader::Leave(std::string_view bytes, bool last, std::size_t done)
 /// If another document of a sequence begins, returns false and notes where.
 bool TXmlReader::ParseWithExpat(std::string_view bytes, bool last)
 {
+    // What these held of an earlier document may be gone.
+    fHeld.clear();
+    fNext = std::string_view();
     if (fExpat->Parse(bytes.data(), bytes.size(), last)) {
         return true;
     }
