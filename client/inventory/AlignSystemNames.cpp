@@ -125,6 +125,19 @@ class TSameNames {
     }
 
     // The inventory's own name as it spells it; empty if it has none of them.
+    // Which of several names is the own one is not to be guessed.
+    void RefuseTie(std::size_t inventory, const TNames& names, const std::pair<const std::string, std::size_t>& own) const
+    {
+        for (const std::string& name : names) {
+            const auto found = fCounts[inventory].find(name);
+            if (found != fCounts[inventory].end() && found->second == own.second && !TNameText::Equal(found->first, own.first)) {
+                throw TClientError(fInventories[inventory].path + ": has the names " + EscapeForDisplay(own.first) + " and " +
+                                   EscapeForDisplay(found->first) +
+                                   " equally often in its keys and references, so its own one is not known; use --self");
+            }
+        }
+    }
+
     std::string FindOwn(std::size_t inventory, const TNames& names)
     {
         const TNameMap<std::size_t>& counts = fCounts[inventory];
@@ -136,6 +149,7 @@ class TSameNames {
             }
         }
         if (own != counts.end()) {
+            RefuseTie(inventory, names, *own);
             return own->first;
         }
         if (!HasName(names, fInventories[inventory].label)) {

@@ -139,6 +139,13 @@ void TClassInference::NoteKeys(TClass& cls, const TDraft& instance)
 {
     std::vector<std::string> names;
     for (const auto& key : instance.ownKeys) {
+        if (key.first.empty()) {
+            const TLoadContext::TAt at(fContext, instance.place);
+            fContext.Fail(EStatus::kParseError,
+                          "found a name of an instance of class " + Quote(cls.name) +
+                              " with a value that names no key; the class is not declared, so give its declaration",
+                          EAdvice::kGiveDeclaration);
+        }
         names.push_back(key.first);
     }
     std::sort(names.begin(), names.end(), [](const auto& a, const auto& b) { return TNameText::TLess()(a, b); });

@@ -211,6 +211,11 @@ TEST_F(SystemNamesTest, WhatIsAmbiguousOrMissingIsRefused)
         Compare({ArrayOf("array1", 1), ArrayOf("array2", 1)}, {"--same", "array1=array9"}));
     EXPECT_EQ("cimdelta: a.xml: has none of the names x, y in its keys and references; it is the reference, whose name all get\n",
               Compare({ArrayOf("array1", 1), ArrayOf("array2", 1)}, {"--same", "x=y"}));
+    EXPECT_EQ(
+        "cimdelta: b.xml: has the names array1 and array2 equally often in its keys and references, so its own one is not known; "
+        "use --self\n",
+        Compare({ArrayOf("array1", 1), ArrayClasses() + DiskOf("array2", "1") + DiskOf("array1", "2")},
+                {"--same", "array1=array2"}));
     EXPECT_EQ("cimdelta: --same array1 is no list of names; join names that mean one system by equals signs: --same web01=web02\n",
               Compare({two, two}, {"--same", "array1"}));
     EXPECT_EQ("cimdelta: --same a=a names one name only; join different names that mean one system: --same web01=web02\n",

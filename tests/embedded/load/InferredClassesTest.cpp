@@ -178,6 +178,9 @@ TEST_F(InferredClassesTest, AreRefusedIfInstancesContradictEachOther)
         {"types of keys", Named("Item", KeyBinding("Id", "x"), ""),
          Named("Item", KeyBinding("Id", "1", "VALUETYPE=\"numeric\""), ""),
          "found property \"Id\" of class \"Item\" as uint64, but as string at 1.xml:2:"},
+        {"a value that names no key", Disk("sda"), Named("Disk", "<KEYVALUE>sdb</KEYVALUE>", ""),
+         "found a name of an instance of class \"Disk\" with a value that names no key; the class is not declared, so give its "
+         "declaration"},
         {"no name", Unnamed("Disk", Property("Id", "string", "sda")), "",
          "found an instance of class \"Disk\", which is not declared, and no instance of it has a name with its keys; give its "
          "declaration"},
