@@ -154,6 +154,9 @@ void THttpReader::BeginMessage()
     fIsChunked = fHasLength = false;
     if (line.empty()) {
         fState = EState::kEnded;
+        if (!fChallenge.empty()) {
+            FailChallenge();
+        }
     } else if (line[0] == '<') {
         fState = EState::kToTheEnd;
     } else if (IsRequestLine(line)) {
@@ -199,6 +202,28 @@ void THttpReader::ReadHeaders()
     if (fIsChunked) {
         ReadChunkLength();
     }
+    if (IsChallenge()) {
+        SkipBody();
+    } else {
+        fChallenge.clear();
+    }
+}
+
+/// Whether the client asks again after such an answer: with a password, or somewhere else.
+bool THttpReader::IsChallenge() const
+{
+    const std::string code = fStatus.substr(0, 3);
+    return (code == "401" || code == "407" || (!code.empty() && code[0] == '3')) && (fHasLength || fIsChunked);
+}
+
+/// Passes over the body of a challenge. It counts as lines in front of the answer that follows.
+void THttpReader::SkipBody()
+{
+    const std::size_t first = fLine;
+    char piece[256];
+    while (ReadBody(piece, sizeof(piece)) > 0) {
+    }
+    fEmpty += fLine - first;
 }
 
 void THttpReader::ReadHeader(const std::string& line)
@@ -233,14 +258,25 @@ std::string THttpReader::AdviseOnStatus() const
                                           : "ask the server again";
 }
 
-void THttpReader::CheckStatus() const
+/// Reports the last answer whose status is not 2xx, at its place.
+void THttpReader::FailChallenge()
+{
+    fLine = fChallengeLine;
+    Fail(fChallenge);
+}
+
+void THttpReader::CheckStatus()
 {
     if (fStatus.empty() || fStatus[0] == '1' || fStatus[0] == '2') {
         return;
     }
-    Fail("found the answer \"" + fStatus.substr(0, 80) + "\"" +
-         (fCimError.empty() ? "" : " (CIMError: " + fCimError.substr(0, 80) + ")") + ", expected one with objects; " +
-         AdviseOnStatus());
+    fChallenge = "found the answer \"" + fStatus.substr(0, 80) + "\"" +
+                 (fCimError.empty() ? "" : " (CIMError: " + fCimError.substr(0, 80) + ")") + ", expected one with objects; " +
+                 AdviseOnStatus();
+    fChallengeLine = fLine;
+    if (!IsChallenge()) {
+        FailChallenge();
+    }
 }
 
 void THttpReader::ReadChunkLength()

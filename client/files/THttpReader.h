@@ -25,7 +25,8 @@ class THttpReader : public IByteSource {
     /// `source` must outlive this; messages call it `name`.
     THttpReader(IByteSource& source, const std::string& name);
 
-    /// Errors: also TClientError for a request, an answer whose status is not 2xx, a body that is compressed or ends early, and
+    /// Errors: also TClientError for a request, an answer whose status is not 2xx (unless it is 3xx, 401 or 407 and another answer
+    /// follows), a body that is compressed or ends early, and
     /// wrong headers or chunks; with the line.
     std::size_t Read(char* buffer, std::size_t size) override;
 
@@ -41,7 +42,10 @@ class THttpReader : public IByteSource {
     void ReadHeaders();
     void ReadHeader(const std::string& line);
     std::string AdviseOnStatus() const;
-    void CheckStatus() const;
+    void CheckStatus();
+    bool IsChallenge() const;
+    [[noreturn]] void FailChallenge();
+    void SkipBody();
     void ReadChunkLength();
     void EndChunk();
     std::size_t ReadBody(char* buffer, std::size_t size);
@@ -57,6 +61,8 @@ class THttpReader : public IByteSource {
     bool fEndsInCrLf = false;  // the line of the chunk's length
     bool fIsChunked = false;
     bool fHasLength = false;
+    std::string fChallenge;  // why the last answer has no objects; empty if it has
+    std::size_t fChallengeLine = 0;
     std::string fStatus;     // "404 Not Found"; empty if there is no status line
     std::string fCimError;   // the header of that name
     std::size_t fEmpty = 0;  // lines in front of the body

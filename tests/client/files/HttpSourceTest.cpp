@@ -80,6 +80,9 @@ TEST(HttpSourceTest, BodiesFollowOnAnEmptyLineForEachOfTheirHeaders)
         {"several answers", kOk + "Content-Length: 4\r\n\r\n<a/>\r\n" + kOk + "Content-Length: 4\r\n\r\n<b/>",
          "\n\n\n<a/>\n\n\n\n<b/>"},
         {"an interim answer", "HTTP/1.1 100 Continue\r\n\r\n" + kOk + "Content-Length: 4\r\n\r\n<a/>", "\n\n\n\n\n<a/>"},
+        {"a challenge and the answer",
+         "HTTP/1.1 401 Unauthorized\r\nContent-Length: 4\r\n\r\nno\r\n" + kOk + "Content-Length: 4\r\n\r\n<a/>",
+         "\n\n\n\n\n\n\n<a/>"},
         {"no body", kOk + "Content-Length: 0\r\n\r\n", ""},
     });
 }
@@ -92,6 +95,11 @@ TEST(HttpSourceTest, WhatIsNoAnswerWithObjectsIsRefusedWithItsLine)
          "F:1: found a request of HTTP, which is no inventory; load the server's answer instead"},
         {"a request of the other kind", "M-POST /cimom HTTP/1.1\r\n\r\n",
          "F:1: found a request of HTTP, which is no inventory; load the server's answer instead"},
+        {"only challenges", "HTTP/1.1 302 Found\r\nContent-Length: 0\r\n\r\nHTTP/1.1 401 Unauthorized\r\nContent-Length: 0\r\n\r\n",
+         "F:6: found the answer \"401 Unauthorized\", expected one with objects; ask with the name and the password of a user"},
+        {"a challenge behind an answer",
+         kOk + "Content-Length: 4\r\n\r\n<a/>HTTP/1.1 401 Unauthorized\r\nContent-Length: 0\r\n\r\n",
+         "F:6: found the answer \"401 Unauthorized\", expected one with objects; ask with the name and the password of a user"},
         {"another status", "HTTP/1.1 401 Unauthorized\r\nContent-Length: 0\r\n\r\n",
          "F:3: found the answer \"401 Unauthorized\", expected one with objects; ask with the name and the password of a user"},
         {"a status of no access", "HTTP/1.1 403 Forbidden\r\n\r\n",
