@@ -5,8 +5,8 @@
 #include <string>
 #include <vector>
 
+#include "client/comparison/IDifferences.h"
 #include "client/comparison/TCoverage.h"
-#include "client/comparison/TDifferenceList.h"
 #include "embedded/load/TLoadReport.h"
 #include "provider/TDeltaNamespace.h"
 
@@ -20,9 +20,9 @@ struct TComparisonReport {
     std::string rules;                ///< what messages call the rules
     TCoverage coverage;
     std::vector<std::string> idleRules;  ///< the classes that a rules file names although no inventory has instances of their trees
-    const std::vector<TInventory>* inventories;    ///< those that were compared; they must outlive this
-    boost::shared_ptr<TDeltaNamespace> records;    ///< the delta namespace of the run
-    std::shared_ptr<TDifferenceList> differences;  ///< what the records stand for; reads the inventories
+    const std::vector<TInventory>* inventories;  ///< those that were compared; they must outlive this
+    boost::shared_ptr<TDeltaNamespace> records;  ///< the delta namespace of the run
+    std::shared_ptr<IDifferences> differences;   ///< what the records stand for; reads the inventories
 };
 
 }  // namespace NORVZEL20

@@ -1,14 +1,12 @@
 #pragma once
 
-#include <functional>
 #include <map>
 #include <memory>
 #include <string>
 #include <vector>
 
+#include "client/comparison/IDifferences.h"
 #include "client/comparison/ReadDeltaRecords.h"
-#include "client/comparison/TDifference.h"
-#include "client/comparison/TDifferenceCounts.h"
 #include "client/comparison/TDifferenceReader.h"
 #include "client/inventory/TInventory.h"
 #include "client/rules/TRules.h"
@@ -19,22 +17,18 @@ namespace NORVZEL20 {
 /// for each and nothing else of them, and beside that an index of the instances of the class that is read (TInstanceIndex).
 ///
 /// Threads: one at a time.
-class TDifferenceList {
+class TDifferenceList final : public IDifferences {
   public:
-    using TCallback = std::function<void(const TDifference&)>;
-
     /// `inventories` are those of the run, in its order; they must outlive this and not change meanwhile, and neither must the
     /// records. Errors: TZELException of a namespace; std::bad_alloc. Cost: the names in the records, in classes that exclude keys
     /// also one key for each instance.
     TDifferenceList(const std::vector<TInventory>& inventories, std::shared_ptr<TRules> rules, TDeltaNamespace& records);
 
-    const TDifferenceCounts& GetCounts() const { return fCounts; }
+    TDifferenceCounts GetCounts() const override { return fCounts; }
 
-    /// Calls back with each difference: by class name, then instance, then property. It is valid during the callback.
-    /// Errors: TZELException of a namespace; std::out_of_range if the records are not those of a run with these inventories;
-    /// std::bad_alloc; what the callback throws. Cost: one key for each instance of a class with differences, one more for each
-    /// instance that differs.
-    void ForEach(const TCallback& callback);
+    /// Errors, beside those of IDifferences: std::out_of_range if the records are not those of a run with these inventories. Cost:
+    /// one key for each instance of a class with differences, one more for each instance that differs.
+    void ForEach(const TCallback& callback) override;
 
   private:
     // What decides the place of a record. The texts are those of the record, unless the rules exclude keys.

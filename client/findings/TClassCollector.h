@@ -13,7 +13,7 @@
 
 namespace NORVZEL20 {
 
-/// Groups the differences of one class, which are added in the order of TDifferenceList.
+/// Groups the differences of one class, which are added in the order of IDifferences.
 class TClassCollector {
   public:
     /// `names` must outlive this.

@@ -15,7 +15,7 @@ class TTextFormat {
     /// `report` must outlive this. `colored` adds escape sequences for a terminal.
     TTextFormat(const TComparisonReport& report, bool colored) : fReport(report), fColored(colored) {}
 
-    /// Writes the whole text. Names and values in it are escaped as by EscapeForDisplay. Errors: those of TDifferenceList::ForEach;
+    /// Writes the whole text. Names and values in it are escaped as by EscapeForDisplay. Errors: those of IDifferences::ForEach;
     /// what the sink throws.
     void Write(const TTextSink& sink) const;
 

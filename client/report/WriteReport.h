@@ -8,7 +8,7 @@
 namespace NORVZEL20 {
 
 /// Hands the report to `sink` in that format, piece by piece. `options` matter to text alone. Errors: those of
-/// TDifferenceList::ForEach; what the sink throws.
+/// IDifferences::ForEach; what the sink throws.
 void WriteReport(const TComparisonReport& report, EOutputFormat format, const TTextOptions& options, const TTextSink& sink);
 
 }  // namespace NORVZEL20
