@@ -10,9 +10,8 @@
 #include <algorithm>
 #include <boost/algorithm/string/predicate.hpp>
 #include <boost/algorithm/string/trim.hpp>
-#include <cctype>
-#include <cstdint>
 
+#include "client/files/HttpLines.h"
 #include "client/process/TClientError.h"
 
 namespace NORVZEL20 {
@@ -22,40 +21,7 @@ namespace {
 const std::size_t kHttpBlock = 64 * 1024;
 const std::size_t kLongestLine = 64 * 1024;
 const std::size_t kMostLines = 1000;        // of one message, in front of its body
-const std::size_t kMostDigits = 15;         // of a length
 const std::size_t kLongestBeginning = 256;  // of a body, with its XML declaration
-
-bool IsBlankOf(char c)
-{
-    return c == ' ' || c == '\t' || c == '\r' || c == '\n';
-}
-
-// The length of a header's name at the beginning of a line; 0 if there is none.
-std::size_t FindHeaderName(std::string_view line)
-{
-    std::size_t length = 0;
-    while (length < line.size() && (std::isalnum(static_cast<unsigned char>(line[length])) != 0 || line[length] == '-')) {
-        ++length;
-    }
-    const bool hasColon = length > 1 && length < line.size() && line[length] == ':';
-    return hasColon && std::isalpha(static_cast<unsigned char>(line[0])) != 0 ? length : 0;
-}
-
-bool IsRequestLine(std::string_view line)
-{
-    return boost::algorithm::starts_with(line, "POST ") || boost::algorithm::starts_with(line, "M-POST ");
-}
-
-// The digits at the beginning of a line that is the length of a chunk; empty if it is not.
-std::string_view FindChunkLength(std::string_view line)
-{
-    std::size_t length = 0;
-    while (length < line.size() && std::isxdigit(static_cast<unsigned char>(line[length])) != 0) {
-        ++length;
-    }
-    const bool ends = length == line.size() || line[length] == ';' || IsBlankOf(line[length]);
-    return ends && length <= kMostDigits ? line.substr(0, length) : std::string_view();
-}
 
 // Makes an XML declaration of UTF-8 blank; returns false if it names another encoding.
 bool BlankDeclaration(std::string& text)
@@ -75,17 +41,6 @@ bool BlankDeclaration(std::string& text)
 }
 
 }  // namespace
-
-bool THttpReader::IsHttp(std::string_view beginning)
-{
-    if (boost::algorithm::starts_with(beginning, "HTTP/") || IsRequestLine(beginning) || FindHeaderName(beginning) > 0) {
-        return true;
-    }
-    // A length alone could be anything, so it must be in front of XML.
-    const std::string_view digits = FindChunkLength(beginning.substr(0, beginning.find('\n')));
-    const std::size_t next = beginning.find('\n');
-    return !digits.empty() && next != std::string_view::npos && beginning.substr(next + 1, 1) == "<";
-}
 
 THttpReader::THttpReader(IByteSource& source, const std::string& name) : fSource(source), fName(name) {}
 
@@ -145,18 +100,20 @@ std::string THttpReader::TakeLine()
 void THttpReader::BeginMessage()
 {
     std::string line;
+    if (fLine == 1 && PeekLine(line) && boost::algorithm::starts_with(line, kByteOrderMark)) {
+        fAt += kByteOrderMark.size();
+    }
     while (PeekLine(line) && line.empty()) {
         TakeLine();
         ++fEmpty;
     }
+    const bool isBehindLength = fHasLength && !fIsChunked;
     fStatus.clear();
     fCimError.clear();
     fIsChunked = fHasLength = false;
     if (line.empty()) {
         fState = EState::kEnded;
-        if (!fChallenge.empty()) {
-            FailChallenge();
-        }
+        CheckEnd();
     } else if (line[0] == '<') {
         fState = EState::kToTheEnd;
     } else if (IsRequestLine(line)) {
@@ -166,8 +123,11 @@ void THttpReader::BeginMessage()
         TakeLine();
         ++fEmpty;
         ReadHeaders();
-    } else if (FindHeaderName(line) > 0) {
+    } else if (IsFirstHeader(line)) {
         ReadHeaders();
+    } else if (isBehindLength && FindChunkLength(line).empty()) {
+        Fail("found \"" + line.substr(0, 80) +
+             "\" behind the body, expected another answer or the end; its Content-Length is wrong");
     } else {
         ReadChunkLength();
     }
@@ -179,7 +139,7 @@ void THttpReader::ReadHeaders()
     std::string line;
     bool isThere = PeekLine(line);
     for (; isThere && !line.empty(); isThere = PeekLine(line)) {
-        if (FindHeaderName(line) == 0 && !IsBlankOf(line[0])) {
+        if (FindHeaderName(line) == 0 && line[0] != ' ' && line[0] != '\t') {
             Fail("found \"" + line.substr(0, 80) + "\", expected a header of HTTP or an empty line behind the headers");
         }
         ReadHeader(line);
@@ -233,7 +193,7 @@ void THttpReader::ReadHeader(const std::string& line)
     const std::string value = boost::algorithm::trim_copy(line.substr(std::min(length + 1, line.size())));
     if (boost::algorithm::iequals(name, "Content-Length")) {
         const bool isNumber =
-            !value.empty() && value.size() <= kMostDigits && value.find_first_not_of("0123456789") == std::string::npos;
+            !value.empty() && value.size() <= kMostDigitsOfLength && value.find_first_not_of("0123456789") == std::string::npos;
         if (!isNumber) {
             Fail("found the Content-Length \"" + value.substr(0, 80) + "\", expected a number");
         }
@@ -256,6 +216,17 @@ std::string THttpReader::AdviseOnStatus() const
            : code == "403"                ? "ask as a user who may read this"
            : code == "404"                ? "correct the path in the address of the server"
                                           : "ask the server again";
+}
+
+/// A file must not end in a challenge, nor without any body.
+void THttpReader::CheckEnd()
+{
+    if (!fChallenge.empty()) {
+        FailChallenge();
+    }
+    if (!fHasBody) {
+        Fail("found no body, expected an answer with objects; fetch it again");
+    }
 }
 
 /// Reports the last answer whose status is not 2xx, at its place.
@@ -354,7 +325,11 @@ void THttpReader::BeginText()
         more = ReadBody(&fText[length], fText.size() - length);
     }
     fText.resize(length);
+    fHasBody = fHasBody || length > 0;
     fGiven = 0;
+    if (length == 0) {
+        return;
+    }
     if (BlankDeclaration(fText)) {
         fText.insert(0, fEmpty, '\n');
     }

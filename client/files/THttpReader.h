@@ -2,7 +2,6 @@
 
 #include <cstddef>
 #include <string>
-#include <string_view>
 
 #include "client/files/IByteSource.h"
 
@@ -16,18 +15,11 @@ namespace NORVZEL20 {
 /// declaration of UTF-8 becomes blanks, because it may not stand behind empty lines.
 class THttpReader : public IByteSource {
   public:
-    /// How many first bytes of a file IsHttp needs.
-    static constexpr std::size_t kMark = 128;
-
-    /// Whether a file that begins so is a recorded message of HTTP.
-    static bool IsHttp(std::string_view beginning);
-
     /// `source` must outlive this; messages call it `name`.
     THttpReader(IByteSource& source, const std::string& name);
 
-    /// Errors: also TClientError for a request, an answer whose status is not 2xx (unless it is 3xx, 401 or 407 and another answer
-    /// follows), a body that is compressed or ends early, and
-    /// wrong headers or chunks; with the line.
+    /// Errors: also TClientError, with the line, for a request, an answer whose status is not 2xx (unless it is 3xx, 401 or 407 and
+    /// another answer follows), a body that is compressed or ends early, no body at all, and wrong headers or chunks.
     std::size_t Read(char* buffer, std::size_t size) override;
 
   private:
@@ -44,6 +36,7 @@ class THttpReader : public IByteSource {
     std::string AdviseOnStatus() const;
     void CheckStatus();
     bool IsChallenge() const;
+    void CheckEnd();
     [[noreturn]] void FailChallenge();
     void SkipBody();
     void ReadChunkLength();
@@ -61,6 +54,7 @@ class THttpReader : public IByteSource {
     bool fEndsInCrLf = false;  // the line of the chunk's length
     bool fIsChunked = false;
     bool fHasLength = false;
+    bool fHasBody = false;   // any of the answers read so far
     std::string fChallenge;  // why the last answer has no objects; empty if it has
     std::size_t fChallengeLine = 0;
     std::string fStatus;     // "404 Not Found"; empty if there is no status line

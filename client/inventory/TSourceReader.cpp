@@ -7,6 +7,7 @@
 #include <boost/algorithm/string/predicate.hpp>
 #include <boost/smart_ptr/make_shared.hpp>
 
+#include "client/files/HttpLines.h"
 #include "client/files/THttpReader.h"
 #include "client/inventory/TInventoryFile.h"
 #include "embedded/cimxml/TCimXmlDocuments.h"
@@ -45,7 +46,7 @@ void TSourceReader::Read(const std::string& path)
     TInventoryFile file(path);
     try {
         TPeekedSource text(file, kFormMark);
-        if (THttpReader::IsHttp(text.GetBeginning())) {
+        if (IsHttp(text.GetBeginning())) {
             THttpReader bodies(text, file.GetName());
             TPeekedSource body(bodies, kFormMark);
             return ReadText(body, path, file.GetName());

@@ -1,6 +1,7 @@
 // Recorded answers of HTTP as inventories.
 #include <string>
 
+#include "client/files/HttpLines.h"
 #include "client/files/THttpReader.h"
 #include "client/process/TClientError.h"
 #include "tests/client/TClientFixture.h"
@@ -56,7 +57,7 @@ struct THttpRow {
 void ExpectUnwrapped(std::initializer_list<THttpRow> rows)
 {
     for (const THttpRow& row : rows) {
-        EXPECT_TRUE(THttpReader::IsHttp(row.text.substr(0, THttpReader::kMark))) << row.what;
+        EXPECT_TRUE(IsHttp(row.text)) << row.what;
         for (const std::size_t piece : {1, 2, 5, 1000}) {
             EXPECT_EQ(row.body, Unwrap(row.text, piece)) << row.what << " in pieces of " << piece;
         }
@@ -83,7 +84,10 @@ TEST(HttpSourceTest, BodiesFollowOnAnEmptyLineForEachOfTheirHeaders)
         {"a challenge and the answer",
          "HTTP/1.1 401 Unauthorized\r\nContent-Length: 4\r\n\r\nno\r\n" + kOk + "Content-Length: 4\r\n\r\n<a/>",
          "\n\n\n\n\n\n\n<a/>"},
-        {"no body", kOk + "Content-Length: 0\r\n\r\n", ""},
+        {"no body and another", kOk + "Content-Length: 0\r\n\r\n" + kOk + "\r\n<a/>", "\n\n\n\n\n<a/>"},
+        {"headers with odd names", kOk + "X: 1\r\nmy_header.2: 2\r\n\r\n<a/>", "\n\n\n\n<a/>"},
+        {"empty lines in front", "\r\n\n" + kOk + "\r\n<a/>", "\n\n\n\n<a/>"},
+        {"a byte order mark in front", "\xef\xbb\xbf" + kOk + "\r\n<a/>", "\n\n<a/>"},
     });
 }
 
@@ -121,6 +125,9 @@ TEST(HttpSourceTest, WhatIsNoAnswerWithObjectsIsRefusedWithItsLine)
          "F:5: found more bytes than the chunk's length says, expected the end of a line"},
         {"a chunk whose length takes the end of its line", chunked + "4\r\n<a/>\r\n1\r\n\r\n\r\n0\r\n\r\n",
          "F:7: found more bytes than the chunk's length says, expected the end of a line"},
+        {"bytes behind the body", kOk + "Content-Length: 3\r\n\r\n<a/>\r\n",
+         "F:4: found \">\" behind the body, expected another answer or the end; its Content-Length is wrong"},
+        {"no body", kOk + "Content-Length: 0\r\n\r\n", "F:4: found no body, expected an answer with objects; fetch it again"},
         {"headers that end early", kOk + "Content-Length: 4\r\n\r\n<a/>\r\n" + kOk + "Content-Type: appl",
          "F:7: the headers of an answer end early; it was cut off, so fetch it again"},
         {"a status line alone", "HTTP/1.1 200 OK", "F:2: the headers of an answer end early; it was cut off, so fetch it again"},
@@ -133,8 +140,8 @@ TEST(HttpSourceTest, WhatIsNoAnswerWithObjectsIsRefusedWithItsLine)
 TEST(HttpSourceTest, OtherFilesAreNotTakenForHttp)
 {
     for (const char* text : {"<CIM/>", "<?xml version=\"1.0\"?><CIM/>", "\n<CIM/>", "", "class A : B {};", "// MOF", "[Key] class",
-                             "123\r\n", "a\r\nb", "instance of A { p = 1; };"}) {
-        EXPECT_FALSE(THttpReader::IsHttp(text)) << text;
+                             "123\r\n", "a\r\nb", "x: 1", "a_b: 1", "instance of A { p = 1; };"}) {
+        EXPECT_FALSE(IsHttp(text)) << text;
     }
 }
 
