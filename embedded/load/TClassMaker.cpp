@@ -143,10 +143,12 @@ void TClassMaker::AddQualifiers(TElement& element, const TQualifiers& qualifiers
     }
 }
 
-/// Notes what is odd about a qualifier. Real servers write undeclared ones, published schemas restate flavors.
+/// Notes what is odd about a qualifier. Servers' answers come without any declarations of qualifiers, published schemas restate
+/// flavors.
 void TClassMaker::NoteQualifier(const TEmbeddedObject::TQualifier& qualifier, const ICIMQualifier* inherited)
 {
-    if (!fNamespace.FindQualifierDecl(qualifier.name)) {
+    const bool areDeclared = !fNamespace.GetQualifierDecls().empty();
+    if (areDeclared && !fNamespace.FindQualifierDecl(qualifier.name)) {
         fContext.Tolerate("undeclared qualifier",
                           "qualifier " + Quote(qualifier.name) + " is not declared; taken as it is written");
     }

@@ -58,8 +58,10 @@ TEST_F(SchemaOfLoadTest, WhatIsOddInItIsNotSaidAgain)
 {
     const std::string odd = "<CLASS NAME=\"Fan\"><QUALIFIER NAME=\"Odd\" TYPE=\"boolean\"/><PROPERTY NAME=\"Id\" TYPE=\"string\">"
                             "<QUALIFIER NAME=\"Key\" TYPE=\"boolean\"><VALUE>TRUE</VALUE></QUALIFIER></PROPERTY></CLASS>";
+    const std::string declared =
+        "<QUALIFIER.DECLARATION NAME=\"Other\" TYPE=\"boolean\"><SCOPE CLASS=\"true\"/></QUALIFIER.DECLARATION>";
     TOptionLoading schema;
-    EXPECT_EQ("", schema.Load({odd}));
+    EXPECT_EQ("", schema.Load({declared, odd}));
     ASSERT_EQ(1u, schema.fReport.tolerated.size());
     EXPECT_EQ(2u, schema.fReport.tolerated.front().count);
     EXPECT_EQ(1u, schema.fReport.tolerated.front().others);
