@@ -12,16 +12,6 @@ namespace {
 
 using L = TLoading;
 
-std::string ArrayOf(const std::string& name, const std::string& type, const std::vector<std::string>& texts)
-{
-    std::string elements;
-    for (const std::string& text : texts) {
-        elements += "<VALUE>" + text + "</VALUE>";
-    }
-    return "<PROPERTY.ARRAY NAME=\"" + name + "\" TYPE=\"" + type + "\"><VALUE.ARRAY>" + elements +
-           "</VALUE.ARRAY></PROPERTY.ARRAY>";
-}
-
 std::string InProperty(const std::string& text)
 {
     return "<PROPERTY NAME=\"E\" TYPE=\"string\" EmbeddedObject=\"instance\"><VALUE>" + text + "</VALUE></PROPERTY>";
@@ -52,7 +42,7 @@ TEST(BadObjectsTest, WhatIsInsideOfABadObjectDoesNotCount)
 {
     const std::string broken = kBadInside.substr(0, kBadInside.rfind("&lt;/INSTANCE")) + "&lt;oops/&gt;";
     const auto array = [](const std::vector<std::string>& texts) {
-        std::string elements = ArrayOf("E", "string", texts);
+        std::string elements = L::Array("E", "string", texts);
         return elements.insert(elements.find(" TYPE"), " EmbeddedObject=\"instance\"");
     };
     const std::string arrays = L::Class("A", "<PROPERTY.ARRAY NAME=\"E\" TYPE=\"string\"/>");
@@ -89,7 +79,7 @@ TEST(BadObjectsTest, NorInAnArrayThatIsReadAtTheEnd)
 {
     const std::string broken = kBadInside.substr(0, kBadInside.rfind("&lt;/INSTANCE")) + "&lt;oops/&gt;";
     const std::string contents =
-        L::Instance("A", "1", ArrayOf("E", "string", {kBadInside, broken})) +
+        L::Instance("A", "1", L::Array("E", "string", {kBadInside, broken})) +
         L::Class("A", "<PROPERTY.ARRAY NAME=\"E\" TYPE=\"string\"><QUALIFIER NAME=\"EmbeddedInstance\" TYPE=\"string\">"
                       "<VALUE>B</VALUE></QUALIFIER></PROPERTY.ARRAY>");
     EXPECT_EQ("A.E 1", CountsOf(EBadValues::kText, contents));

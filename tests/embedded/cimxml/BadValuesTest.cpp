@@ -15,16 +15,6 @@ namespace {
 using L = TLoading;
 using TType = TCIMValue::TCIMType;
 
-std::string Array(const std::string& name, const std::string& type, const std::vector<std::string>& texts)
-{
-    std::string elements;
-    for (const std::string& text : texts) {
-        elements += "<VALUE>" + text + "</VALUE>";
-    }
-    return "<PROPERTY.ARRAY NAME=\"" + name + "\" TYPE=\"" + type + "\"><VALUE.ARRAY>" + elements +
-           "</VALUE.ARRAY></PROPERTY.ARRAY>";
-}
-
 std::string Marked(const std::string& qualifier)
 {
     return "<QUALIFIER NAME=\"" + qualifier + "\" TYPE=\"boolean\"><VALUE>TRUE</VALUE></QUALIFIER>";
@@ -148,7 +138,7 @@ TEST_F(BadValuesTest, AValueOfAnotherTypeThatDoesNotConvertIsOne)
 {
     const std::string contents = kDeclared + L::Instance("A", "1", L::Property("N", "uint32", "70000")) +
                                  L::Instance("A", "2", L::Property("N", "string", "x")) +
-                                 L::Instance("A", "3", Array("N", "uint16", {"1", "2"}));
+                                 L::Instance("A", "3", L::Array("N", "uint16", {"1", "2"}));
     EXPECT_EQ("A.N 3: \"70000\" is no uint16, doc.xml:3:153, A.Id=\"1\"\n", Load(EBadValues::kText, contents));
     EXPECT_EQ("string 70000", Stored("1"));
     EXPECT_EQ("string x", Stored("2"));
@@ -164,7 +154,7 @@ TEST_F(BadValuesTest, AValueOfAnotherTypeThatDoesNotConvertIsOne)
 TEST_F(BadValuesTest, AnArrayWithOneIsTextAsAWhole)
 {
     const std::string declared = L::Class("A", "<PROPERTY.ARRAY NAME=\"N\" TYPE=\"uint8\"/>");
-    const std::string contents = declared + L::Instance("A", "1", Array("N", "uint8", {"0x10", "300", "2", "x"}));
+    const std::string contents = declared + L::Instance("A", "1", L::Array("N", "uint8", {"0x10", "300", "2", "x"}));
     EXPECT_EQ("A.N 1: \"300\" is no uint8, doc.xml:3:180, A.Id=\"1\"\n", Load(EBadValues::kText, contents));
     EXPECT_EQ("string[] {\"16\", \"300\", \"2\", \"x\"}", Stored("1", "N"));
     fLoading = TLoading();

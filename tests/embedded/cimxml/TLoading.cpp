@@ -99,6 +99,16 @@ std::string TLoading::Property(const std::string& name, const std::string& type,
     return "<PROPERTY NAME=\"" + name + "\" TYPE=\"" + type + "\"><VALUE>" + value + "</VALUE></PROPERTY>";
 }
 
+std::string TLoading::Array(const std::string& name, const std::string& type, const std::vector<std::string>& values)
+{
+    std::string elements;
+    for (const std::string& value : values) {
+        elements += "<VALUE>" + value + "</VALUE>";
+    }
+    return "<PROPERTY.ARRAY NAME=\"" + name + "\" TYPE=\"" + type + "\"><VALUE.ARRAY>" + elements +
+           "</VALUE.ARRAY></PROPERTY.ARRAY>";
+}
+
 std::string TLoading::Tolerated(const TLoadReport& report)
 {
     std::string lines;

@@ -2,6 +2,7 @@
 
 #include <boost/smart_ptr/shared_ptr.hpp>
 #include <string>
+#include <vector>
 
 #include "embedded/load/TLoadReport.h"
 #include "embedded/store/TInMemNamespace.h"
@@ -38,6 +39,7 @@ class TLoading {
     /// An instance with the key Id and further property elements.
     static std::string Instance(const std::string& className, const std::string& id, const std::string& properties = std::string());
     static std::string Property(const std::string& name, const std::string& type, const std::string& value);
+    static std::string Array(const std::string& name, const std::string& type, const std::vector<std::string>& values);
     /// The tolerated lines, one below the other.
     static std::string Tolerated(const TLoadReport& report);
 
