@@ -4,6 +4,7 @@
 #include <memory>
 
 #include "client/AddLoadingOptions.h"
+#include "client/AddReportOptions.h"
 #include "client/AddSystemNames.h"
 #include "client/AddText.h"
 #include "client/ArgumentGuard.h"
@@ -127,13 +128,7 @@ void TCommands::AddCompare()
     AddSystemNames(command, fCompare.systems);
     AddOutput(command, fCompare.output);
     AddStrictSchema(command, fCompare.strictSchema);
-    command->add_flag("--detail", fCompare.text.isDetailed, "show each difference on its own, and all of the coverage");
-    command->add_flag("--coverage", fCompare.text.hasWholeCoverage, "show all of what was compared and what not");
-    command
-        ->add_option("--limit", fCompare.text.mostLines,
-                     "shorten groups until the findings of a text report take no more lines, if they can")
-        ->check(CLI::PositiveNumber)
-        ->option_text("LINES");
+    AddReportOptions(command, fCompare.text);
     command->add_flag("--allow-empty", fCompare.allowEmpty, "do not take it for an error if nothing was compared");
 }
 

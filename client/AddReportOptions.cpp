@@ -1,0 +1,16 @@
+#include "client/AddReportOptions.h"
+
+namespace NORVZEL20 {
+
+void AddReportOptions(CLI::App* command, TTextOptions& text)
+{
+    command->add_flag("--detail", text.isDetailed, "show each difference on its own, and all of the coverage");
+    command->add_flag("--coverage", text.hasWholeCoverage, "show all of what was compared and what not");
+    command
+        ->add_option("--limit", text.mostLines,
+                     "shorten groups until the findings of a text report take no more lines, if they can")
+        ->check(CLI::PositiveNumber)
+        ->option_text("LINES");
+}
+
+}  // namespace NORVZEL20
