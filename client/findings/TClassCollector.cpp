@@ -3,6 +3,8 @@
 #include "client/findings/TClassCollector.h"
 
 #include <algorithm>
+#include <set>
+#include <tuple>
 #include <utility>
 
 #include "client/findings/CollectFindings.h"
@@ -28,6 +30,16 @@ std::string WholeText(const TValueDifference& change)
         }
     }
     return text;
+}
+
+// Those whose value changed, ascending.
+std::vector<std::size_t> InventoriesOf(const TValueDifference& change)
+{
+    std::set<std::size_t> inventories;
+    for (const TValueDifference::TGroup& group : change.others) {
+        inventories.insert(group.inventories.begin(), group.inventories.end());
+    }
+    return {inventories.begin(), inventories.end()};
 }
 
 bool SharesKey(const TDifference& difference)
@@ -83,9 +95,8 @@ void TClassCollector::AddChange(const TDifference& difference, const TValueDiffe
         }
         return;
     }
-    TProperty& property = fProperties[change.property];
+    TProperty& property = fProperties[{change.property, InventoriesOf(change)}];
     ++property.instances;
-    property.inventories.insert(difference.inventories.begin(), difference.inventories.end());
     const auto [known, isNew] = property.positions.emplace(WholeText(change), property.changes.size());
     if (isNew) {
         property.changes.push_back({change, 0, {}, false});
@@ -102,16 +113,19 @@ TClassFindings TClassCollector::Take()
 {
     std::stable_sort(fFindings.presences.begin(), fFindings.presences.end(),
                      [](const TPresenceFinding& one, const TPresenceFinding& other) { return one.kind < other.kind; });
-    for (auto& [name, property] : fProperties) {
+    for (auto& [where, property] : fProperties) {
         std::vector<TChangeFinding>& changes = property.changes;
         std::stable_sort(changes.begin(), changes.end(),
                          [](const TChangeFinding& one, const TChangeFinding& other) { return one.instances > other.instances; });
         const std::size_t distinct = changes.size();
         changes.resize(std::min(distinct, kMostExamples));
-        fFindings.properties.push_back(
-            {name, property.instances, distinct, {property.inventories.begin(), property.inventories.end()}, std::move(changes)});
+        fFindings.properties.push_back({where.first, property.instances, distinct, where.second, std::move(changes)});
     }
     fProperties.clear();
+    std::stable_sort(fFindings.properties.begin(), fFindings.properties.end(),
+                     [](const TPropertyFinding& one, const TPropertyFinding& other) {
+                         return std::tie(one.property, one.changes) < std::tie(other.property, other.changes);
+                     });
     return std::move(fFindings);
 }
 

@@ -2,9 +2,9 @@
 
 #include <cstddef>
 #include <map>
-#include <set>
 #include <string>
 #include <unordered_map>
+#include <utility>
 #include <vector>
 
 #include "client/comparison/TDifference.h"
@@ -26,20 +26,20 @@ class TClassCollector {
     TClassFindings Take();
 
   private:
-    // The changes of one property, each by the text that says all of it.
+    // The changes of one property in the same inventories, each by the text that says all of it.
     struct TProperty {
         std::vector<TChangeFinding> changes;
         std::unordered_map<std::string, std::size_t> positions;  // in `changes`
-        std::set<std::size_t> inventories;
         std::size_t instances = 0;
     };
+    using TWhere = std::pair<std::string, std::vector<std::size_t>>;  // the property, and the inventories
 
     void AddPresence(const TDifference& difference);
     void AddChange(const TDifference& difference, const TValueDifference& change);
 
     TShortNames& fNames;
     TClassFindings fFindings;
-    std::map<std::string, TProperty> fProperties;
+    std::map<TWhere, TProperty> fProperties;
     std::string fInstance;  // of the last changed value
 };
 

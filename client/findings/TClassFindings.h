@@ -14,7 +14,7 @@ struct TClassFindings {
     std::string className;
     TDifferenceCounts counts;                  ///< instancesOnlyInOthers is not counted
     std::vector<TPresenceFinding> presences;   ///< those of the reference first; then in the order of the differences
-    std::vector<TPropertyFinding> properties;  ///< ascending by name
+    std::vector<TPropertyFinding> properties;  ///< ascending by name; of the same name, those with fewest changes first
 };
 
 }  // namespace NORVZEL20
