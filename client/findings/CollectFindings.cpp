@@ -6,7 +6,7 @@
 
 namespace NORVZEL20 {
 
-TFindings CollectFindings(const TComparisonReport& report)
+TFindings CollectFindings(const TComparisonReport& report, std::size_t most)
 {
     TFindings findings;
     findings.differences.assign(report.labels.size(), 0);
@@ -17,7 +17,7 @@ TFindings CollectFindings(const TComparisonReport& report)
             if (collector) {
                 findings.classes.push_back(collector->Take());
             }
-            collector.emplace(names, difference.className);
+            collector.emplace(names, difference.className, most);
         }
         collector->Add(difference);
         for (const std::size_t inventory : difference.inventories) {

@@ -10,9 +10,12 @@ namespace NORVZEL20 {
 
 /// One change of one property, and the instances in which it is the same.
 struct TChangeFinding {
-    TValueDifference change;         ///< the property, the reference's value and the others'; without parts
-    std::size_t instances = 0;       ///< how many instances have it
-    std::vector<std::string> names;  ///< of the first of them, in the order of the differences; see TShortNames
+    TValueDifference change;    ///< the property, the reference's value and the others'; without parts
+    std::size_t instances = 0;  ///< how many instances have it
+    /// Some of them, in the order of the differences: the first ones, unless a property has more distinct changes than examples are
+    /// kept. See TShortNames.
+    std::vector<std::string> names;
+    std::vector<std::string> paths;  ///< the same, as TDifference::instance has them
     bool isShared = false;           ///< whether instances of one inventory share a key in any of them
 };
 

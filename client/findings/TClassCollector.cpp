@@ -1,13 +1,17 @@
 // Changes are the same if all of it is: the property, the reference's value, each other value and the inventories that have it.
 // They are compared by a text that leaves nothing out, since two values may look alike in a report.
+//
+// A class may have as many distinct changes as differences, so of each only the hashes of that text and a count are held. The
+// changes that most instances have are held as examples: if an example has fewer instances than a change that is just being
+// counted, the change takes its place. A change that comes in so late is known by the instances that follow.
 #include "client/findings/TClassCollector.h"
 
 #include <algorithm>
+#include <functional>
 #include <set>
 #include <tuple>
 #include <utility>
 
-#include "client/findings/CollectFindings.h"
 #include "client/text/DisplayText.h"
 #include "embedded/value/TValueText.h"
 
@@ -53,7 +57,7 @@ bool SharesKey(const TDifference& difference)
 
 }  // namespace
 
-TClassCollector::TClassCollector(TShortNames& names, const std::string& className) : fNames(names)
+TClassCollector::TClassCollector(TShortNames& names, const std::string& className, std::size_t most) : fNames(names), fMost(most)
 {
     fFindings.className = className;
 }
@@ -81,8 +85,8 @@ void TClassCollector::AddPresence(const TDifference& difference)
         known = std::prev(fFindings.presences.end());
     }
     known->instances += 1;
-    if (known->examples.size() < kMostExamples) {
-        known->examples.push_back({fNames.Of(difference), difference.contents});
+    if (known->examples.size() < fMost) {
+        known->examples.push_back({fNames.Of(difference), difference.contents, difference.instance});
     }
 }
 
@@ -97,15 +101,45 @@ void TClassCollector::AddChange(const TDifference& difference, const TValueDiffe
     }
     TProperty& property = fProperties[{change.property, InventoriesOf(change)}];
     ++property.instances;
-    const auto [known, isNew] = property.positions.emplace(WholeText(change), property.changes.size());
-    if (isNew) {
-        property.changes.push_back({change, 0, {}, false});
+    const std::string text = WholeText(change);
+    const std::hash<std::string> hash;
+    const TDigest digest(hash(text), hash("2" + text));
+    TKnown& known = property.known[digest];
+    ++known.instances;
+    if (known.place == kNowhere) {
+        Keep(property, digest, known, change);
     }
-    TChangeFinding& finding = property.changes[known->second];
-    ++finding.instances;
+    if (known.place == kNowhere) {
+        return;
+    }
+    property.kept[known.place].instances = known.instances;
+    TChangeFinding& finding = property.examples[known.place];
     finding.isShared = finding.isShared || SharesKey(difference);
-    if (finding.names.size() < kMostExamples) {
+    if (finding.names.size() < fMost) {
         finding.names.push_back(fNames.Of(difference));
+        finding.paths.push_back(difference.instance);
+    }
+}
+
+// Makes the change an example if there is room, or an example with fewer instances.
+void TClassCollector::Keep(TProperty& property, const TDigest& digest, TKnown& known, const TValueDifference& change) const
+{
+    if (property.examples.size() < fMost) {
+        known.place = property.examples.size();
+        property.examples.push_back({change, 0, {}, {}, false});
+        property.kept.push_back({digest, 0});
+        return;
+    }
+    if (known.instances <= property.fewest) {
+        return;
+    }
+    const auto least = std::min_element(property.kept.begin(), property.kept.end(),
+                                        [](const TKept& one, const TKept& other) { return one.instances < other.instances; });
+    property.fewest = least->instances;
+    if (known.instances > least->instances) {
+        std::swap(known.place, property.known[least->digest].place);
+        least->digest = digest;
+        property.examples[known.place] = {change, 0, {}, {}, false};
     }
 }
 
@@ -114,12 +148,13 @@ TClassFindings TClassCollector::Take()
     std::stable_sort(fFindings.presences.begin(), fFindings.presences.end(),
                      [](const TPresenceFinding& one, const TPresenceFinding& other) { return one.kind < other.kind; });
     for (auto& [where, property] : fProperties) {
-        std::vector<TChangeFinding>& changes = property.changes;
-        std::stable_sort(changes.begin(), changes.end(),
+        std::vector<TChangeFinding>& examples = property.examples;
+        for (std::size_t i = 0; i < examples.size(); ++i) {
+            examples[i].instances = property.kept[i].instances;
+        }
+        std::stable_sort(examples.begin(), examples.end(),
                          [](const TChangeFinding& one, const TChangeFinding& other) { return one.instances > other.instances; });
-        const std::size_t distinct = changes.size();
-        changes.resize(std::min(distinct, kMostExamples));
-        fFindings.properties.push_back({where.first, property.instances, distinct, where.second, std::move(changes)});
+        fFindings.properties.push_back({where.first, property.instances, property.known.size(), where.second, std::move(examples)});
     }
     fProperties.clear();
     std::stable_sort(fFindings.properties.begin(), fFindings.properties.end(),

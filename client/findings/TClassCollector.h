@@ -16,8 +16,8 @@ namespace NORVZEL20 {
 /// Groups the differences of one class, which are added in the order of IDifferences.
 class TClassCollector {
   public:
-    /// `names` must outlive this.
-    TClassCollector(TShortNames& names, const std::string& className);
+    /// Of each finding, at most `most` examples are kept. `names` must outlive this.
+    TClassCollector(TShortNames& names, const std::string& className, std::size_t most);
 
     const std::string& GetClassName() const { return fFindings.className; }
 
@@ -26,18 +26,41 @@ class TClassCollector {
     TClassFindings Take();
 
   private:
-    // The changes of one property in the same inventories, each by the text that says all of it.
+    // A change by the text that says all of it: 128 bits of its hashes.
+    using TDigest = std::pair<std::size_t, std::size_t>;
+    struct THashOfDigest {
+        std::size_t operator()(const TDigest& digest) const { return digest.first; }
+    };
+
+    // A distinct change of a property.
+    struct TKnown {
+        std::size_t instances = 0;
+        std::size_t place = kNowhere;  // in TProperty::examples
+    };
+    static constexpr std::size_t kNowhere = static_cast<std::size_t>(-1);
+
+    // The same of an example, as far as it is counted.
+    struct TKept {
+        TDigest digest;
+        std::size_t instances;
+    };
+
+    // The changes of one property in the same inventories.
     struct TProperty {
-        std::vector<TChangeFinding> changes;
-        std::unordered_map<std::string, std::size_t> positions;  // in `changes`
+        std::unordered_map<TDigest, TKnown, THashOfDigest> known;
+        std::vector<TChangeFinding> examples;  // the changes that most instances have so far
+        std::vector<TKept> kept;               // of the examples
+        std::size_t fewest = 0;                // no example has fewer instances
         std::size_t instances = 0;
     };
     using TWhere = std::pair<std::string, std::vector<std::size_t>>;  // the property, and the inventories
 
     void AddPresence(const TDifference& difference);
     void AddChange(const TDifference& difference, const TValueDifference& change);
+    void Keep(TProperty& property, const TDigest& digest, TKnown& known, const TValueDifference& change) const;
 
     TShortNames& fNames;
+    const std::size_t fMost;
     TClassFindings fFindings;
     std::map<TWhere, TProperty> fProperties;
     std::string fInstance;  // of the last changed value

@@ -15,6 +15,7 @@ struct TPresenceFinding {
     struct TExample {
         std::string name;                                         ///< see TShortNames
         std::vector<std::pair<std::string, TCIMValue>> contents;  ///< see TDifference::contents
+        std::string path;                                         ///< see TDifference::instance
     };
 
     TDifference::EKind kind;               ///< kOnlyInReference or kOnlyInOthers

@@ -5,58 +5,28 @@
 //     "property": "Size", "reference": { "type": "uint64", "value": 500 },
 //     "others": [ { "inventories": [ "web02" ], "type": "uint64", "value": 250,
 //                   "sharing": [ { "inventory": "web02", "instances": 1 } ] } ] }
-//   { "kind": "onlyInReference", "class": ..., "inventories": [ "web02" ], "path": "root/cimv2:Disk.BootId=1,Id=\"sdb\"" }
+//   { "kind": "onlyInReference", "class": ..., "inventories": [ "web02" ], "path": "root/cimv2:Disk.BootId=1,Id=\"sdb\"",
+//     "contents": { "Size": { "type": "uint64", "value": 500 } } }
 //   { "kind": "onlyInOthers", "class": ..., "inventories": [ "web02", "web03" ],
-//     "disagreements": [ { "property": "Size", "others": [ ... ] } ] }
+//     "disagreements": [ { "property": "Size", "others": [ ... ] } ], "contents": { ... } }
 //
 // "sharing" is there only if several instances of an inventory have the key: beside "inventories" it says how many, beside a value
 // how many of them have the value. A value that is an embedded object has "embedded" with its contents (see ContentsOf), and if all
 // values are instances of one class, "parts" behind "others" has the properties in which they differ, each as "property",
 // "reference", "others" and perhaps "parts". "path" is there only if the rules of the class exclude keys, "disagreements" only if
-// there are any.
+// there are any. "contents" has the compared properties that are not null and no keys, of the reference or the first of
+// "inventories".
 #include "client/report/JsonDifference.h"
 
 #include <utility>
 
 #include "client/report/JsonValue.h"
-#include "client/text/EmbeddedText.h"
-#include "embedded/value/TValueText.h"
 
 namespace NORVZEL20 {
 
 namespace {
 
 using TJson = nlohmann::ordered_json;
-
-const char* KindName(TDifference::EKind kind)
-{
-    switch (kind) {
-    case TDifference::kOnlyInReference:
-        return "onlyInReference";
-    case TDifference::kOnlyInOthers:
-        return "onlyInOthers";
-    default:
-        return "changed";
-    }
-}
-
-TJson ValueWithType(const TCIMValue& value)
-{
-    TJson json = {{"type", TValueText::DescribeType(value.GetType())}, {"value", JsonOf(value)}};
-    if (HasEmbeddedObject(value)) {
-        json["embedded"] = ContentsOf(value);
-    }
-    return json;
-}
-
-// Adds a list that is there only if it has elements. It is made before it is added: nlohmann's push_back on a missing element first
-// makes that element an array, and ends the process if there is no memory for it.
-void AddList(TJson& json, const char* name, TJson list)
-{
-    if (!list.empty()) {
-        json[name] = std::move(list);
-    }
-}
 
 // Makes the parts of one difference, which are all made with its report.
 class TDifferenceWriter {
@@ -69,11 +39,11 @@ class TDifferenceWriter {
         for (const auto& key : fDifference.keys) {
             keys[key.first] = JsonOf(key.second);
         }
-        TJson json = {{"kind", KindName(fDifference.kind)},
+        TJson json = {{"kind", JsonOfKind(fDifference.kind)},
                       {"class", fDifference.className},
                       {"instance", fDifference.instance},
                       {"keys", keys},
-                      {"inventories", Labels(fDifference.inventories)}};
+                      {"inventories", JsonOfLabels(fReport, fDifference.inventories)}};
         AddSharing(json);
         if (!fDifference.path.empty()) {
             json["path"] = fDifference.path;
@@ -83,15 +53,6 @@ class TDifferenceWriter {
     }
 
   private:
-    TJson Labels(const std::vector<std::size_t>& inventories) const
-    {
-        TJson labels = TJson::array();
-        for (const std::size_t inventory : inventories) {
-            labels.push_back(fReport.labels[inventory]);
-        }
-        return labels;
-    }
-
     TJson Sharing(std::size_t inventory, std::size_t instances) const
     {
         return {{"inventory", fReport.labels[inventory]}, {"instances", instances}};
@@ -105,7 +66,7 @@ class TDifferenceWriter {
                 sharing.push_back(Sharing(i, fDifference.CountSharing(i)));
             }
         }
-        AddList(json, "sharing", std::move(sharing));
+        AddJsonList(json, "sharing", std::move(sharing));
     }
 
     void AddValues(TJson& json) const
@@ -114,7 +75,12 @@ class TDifferenceWriter {
             json.update(Values(fDifference.values.front()));
             return;
         }
-        AddList(json, "disagreements", Values(fDifference.values));
+        AddJsonList(json, "disagreements", Values(fDifference.values));
+        TJson contents = TJson::object();
+        for (const auto& [property, value] : fDifference.contents) {
+            contents[property] = JsonWithType(value);
+        }
+        json["contents"] = std::move(contents);
     }
 
     TJson Values(const std::vector<TValueDifference>& differences) const
@@ -130,28 +96,28 @@ class TDifferenceWriter {
     {
         TJson json = {{"property", values.property}};
         if (fDifference.kind == TDifference::kChanged) {
-            json["reference"] = ValueWithType(values.reference);
+            json["reference"] = JsonWithType(values.reference);
         }
         TJson others = TJson::array();
         for (const TValueDifference::TGroup& group : values.others) {
             others.push_back(Group(group));
         }
-        AddList(json, "others", std::move(others));
-        AddList(json, "parts", Values(values.parts));
+        AddJsonList(json, "others", std::move(others));
+        AddJsonList(json, "parts", Values(values.parts));
         return json;
     }
 
     TJson Group(const TValueDifference::TGroup& group) const
     {
-        TJson json = {{"inventories", Labels(group.inventories)}};
-        json.update(ValueWithType(group.value));
+        TJson json = {{"inventories", JsonOfLabels(fReport, group.inventories)}};
+        json.update(JsonWithType(group.value));
         TJson sharing = TJson::array();
         for (std::size_t i = 0; i < group.inventories.size(); ++i) {
             if (fDifference.CountSharing(group.inventories[i]) > 0) {
                 sharing.push_back(Sharing(group.inventories[i], group.CountInstances(i)));
             }
         }
-        AddList(json, "sharing", std::move(sharing));
+        AddJsonList(json, "sharing", std::move(sharing));
         return json;
     }
 
@@ -160,6 +126,27 @@ class TDifferenceWriter {
 };
 
 }  // namespace
+
+const char* JsonOfKind(TDifference::EKind kind)
+{
+    switch (kind) {
+    case TDifference::kOnlyInReference:
+        return "onlyInReference";
+    case TDifference::kOnlyInOthers:
+        return "onlyInOthers";
+    default:
+        return "changed";
+    }
+}
+
+nlohmann::ordered_json JsonOfLabels(const TComparisonReport& report, const std::vector<std::size_t>& inventories)
+{
+    TJson labels = TJson::array();
+    for (const std::size_t inventory : inventories) {
+        labels.push_back(report.labels[inventory]);
+    }
+    return labels;
+}
 
 nlohmann::ordered_json JsonOfDifference(const TComparisonReport& report, const TDifference& difference)
 {

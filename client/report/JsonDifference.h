@@ -1,10 +1,18 @@
 #pragma once
 
+#include <cstddef>
 #include <nlohmann/json.hpp>
+#include <vector>
 
 #include "client/comparison/TComparisonReport.h"
 
 namespace NORVZEL20 {
+
+/// What a kind of difference is called in JSON and in rows of tables.
+const char* JsonOfKind(TDifference::EKind kind);
+
+/// The labels of these inventories as a list.
+nlohmann::ordered_json JsonOfLabels(const TComparisonReport& report, const std::vector<std::size_t>& inventories);
 
 /// One difference as an object. Its shape is drawn in JsonDifference.cpp.
 nlohmann::ordered_json JsonOfDifference(const TComparisonReport& report, const TDifference& difference);

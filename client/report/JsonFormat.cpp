@@ -1,9 +1,12 @@
 // The document, with one element of each list; every name and the order of the names are part of the format:
 //
 //   { "format": "cimdelta-comparison", "version": 1,
-//     "inventories": [ { "label": "web01", "file": "web01.xml", "role": "reference", "instancesCompared": 2 } ],
+//     "inventories": [ { "label": "web01", "file": "web01.xml", "role": "reference", "instancesCompared": 2, "differences": 0 } ],
 //     "summary": { "differences": 1, "onlyInReference": 0, "onlyInOthers": 0, "changedValues": 1, "changedInstances": 1,
-//                  "instancesOnlyInOthers": 0, "everythingCompared": false, "nothingCompared": false },
+//                  "instancesOnlyInOthers": 0, "everythingCompared": false, "nothingCompared": false,
+//                  "classes": [ { "class": "Disk", "onlyInReference": 0, "onlyInOthers": 0, "changedValues": 1,
+//                                 "changedInstances": 1 } ] },
+//     "groups": [ ... ],
 //     "differences": [ ... ],
 //     "coverage": { "classes": [ { "class": "Disk", "state": "compared", "instances": [ 1, 1 ], "propertiesLeftOut": [ "Model" ],
 //                                  "excludedKeys": [], "sharingKeys": [ 0, 0 ], "instancesCompared": [ 1, 1 ],
@@ -24,11 +27,14 @@
 // A class of which cimdelta made instances ends with "madeIn": [ "web02" ]. A note may end with "before": "model", the spelling
 // that was replaced, or with "declared": "Bag" and "declaredAsIn": "Ordered"; its kind decides, also whether it has "property".
 //
-// JsonDifference.cpp shows the differences. Lists of numbers have one for each inventory, the reference first.
+// JsonGroups.cpp shows the groups, JsonDifference.cpp the differences. Lists of numbers have one for each inventory, the reference
+// first.
 #include "client/report/JsonFormat.h"
 
+#include "client/findings/CollectFindings.h"
 #include "client/report/JsonCoverage.h"
 #include "client/report/JsonDifference.h"
+#include "client/report/JsonGroups.h"
 #include "client/report/JsonValue.h"
 #include "client/report/TJsonDocument.h"
 #include "embedded/load/TLoadReport.h"
@@ -39,7 +45,7 @@ namespace {
 
 using TJson = nlohmann::ordered_json;
 
-TJson JsonOfSummary(const TComparisonReport& report)
+TJson JsonOfSummary(const TComparisonReport& report, const TFindings& findings)
 {
     const TDifferenceCounts& counts = report.differences->GetCounts();
     return {{"differences", counts.GetTotal()},
@@ -49,7 +55,8 @@ TJson JsonOfSummary(const TComparisonReport& report)
             {"changedInstances", counts.changedInstances},
             {"instancesOnlyInOthers", counts.instancesOnlyInOthers},
             {"everythingCompared", report.coverage.IsComplete()},
-            {"nothingCompared", report.coverage.IsNothingCompared()}};
+            {"nothingCompared", report.coverage.IsNothingCompared()},
+            {"classes", JsonOfClassCounts(findings)}};
 }
 
 const char* NamespaceOrigin(TLoadReport::ENamespaceOrigin origin)
@@ -75,7 +82,7 @@ TJson JsonOfInferred(const TLoadReport& loaded)
     return classes;
 }
 
-TJson JsonOfInventories(const TComparisonReport& report)
+TJson JsonOfInventories(const TComparisonReport& report, const TFindings& findings)
 {
     TJson inventories = TJson::array();
     for (std::size_t i = 0; i < report.labels.size(); ++i) {
@@ -83,11 +90,25 @@ TJson JsonOfInventories(const TComparisonReport& report)
                                {"file", report.paths[i]},
                                {"role", i == 0 ? "reference" : "other"},
                                {"instancesCompared", report.coverage.CountCompared(i)},
+                               {"differences", findings.differences[i]},
                                {"namespace", report.loads[i].namespaceName},
                                {"namespaceFrom", NamespaceOrigin(report.loads[i].namespaceOrigin)},
                                {"inferredClasses", JsonOfInferred(report.loads[i])}});
     }
     return inventories;
+}
+
+// Groups hold no more than this of what is listed among the differences.
+constexpr std::size_t kExamplesOfGroup = 8;
+
+void AddFindings(TJsonDocument& document, const TComparisonReport& report)
+{
+    const TFindings findings = CollectFindings(report, kExamplesOfGroup);
+    document.Add("inventories", JsonOfInventories(report, findings));
+    document.Add("summary", JsonOfSummary(report, findings));
+    document.StartList("groups");
+    ForEachGroup(report, findings, [&document](const TJson& group) { document.AddElement(group); });
+    document.EndList();
 }
 
 }  // namespace
@@ -97,8 +118,7 @@ void WriteJsonReport(const TComparisonReport& report, const TTextSink& sink)
     TJsonDocument document(sink);
     document.Add("format", "cimdelta-comparison");
     document.Add("version", 1);
-    document.Add("inventories", JsonOfInventories(report));
-    document.Add("summary", JsonOfSummary(report));
+    AddFindings(document, report);
     document.StartList("differences");
     report.differences->ForEach([&](const TDifference& difference) { document.AddElement(JsonOfDifference(report, difference)); });
     document.EndList();
@@ -110,9 +130,14 @@ void WriteNdjsonReport(const TComparisonReport& report, const TTextSink& sink)
 {
     report.differences->ForEach(
         [&](const TDifference& difference) { sink(WriteJson(JsonOfDifference(report, difference), false)); });
-    TJson coverage = {{"kind", "coverage"}, {"inventories", JsonOfInventories(report)}, {"summary", JsonOfSummary(report)}};
-    coverage.update(JsonOfCoverage(report));
-    sink(WriteJson(coverage, false));
+    TJsonDocument line(sink, false);
+    line.Add("kind", "coverage");
+    AddFindings(line, report);
+    const TJson coverage = JsonOfCoverage(report);
+    for (const auto& [name, value] : coverage.items()) {
+        line.Add(name, value);
+    }
+    line.End();
 }
 
 }  // namespace NORVZEL20

@@ -2,10 +2,12 @@
 
 #include <cmath>
 #include <map>
+#include <utility>
 
 #include "client/text/EmbeddedText.h"
 #include "embedded/value/TEmbeddedObject.h"
 #include "embedded/value/TNameText.h"
+#include "embedded/value/TValueText.h"
 
 namespace NORVZEL20 {
 
@@ -84,6 +86,24 @@ nlohmann::ordered_json ContentsOf(const TCIMValue& value)
         properties[name] = contents;
     }
     return {{"class", object->GetClassName()}, {"properties", properties}};
+}
+
+nlohmann::ordered_json JsonWithType(const TCIMValue& value)
+{
+    TJson json = {{"type", TValueText::DescribeType(value.GetType())}, {"value", JsonOf(value)}};
+    if (HasEmbeddedObject(value)) {
+        json["embedded"] = ContentsOf(value);
+    }
+    return json;
+}
+
+// The list is made before it is added: nlohmann's push_back on a missing element first makes that element an array, and ends the
+// process if there is no memory for it.
+void AddJsonList(nlohmann::ordered_json& json, const char* name, nlohmann::ordered_json list)
+{
+    if (!list.empty()) {
+        json[name] = std::move(list);
+    }
 }
 
 std::string WriteJson(const nlohmann::ordered_json& document, bool indented)

@@ -16,6 +16,12 @@ nlohmann::ordered_json JsonOf(const TCIMValue& value);
 /// any other value.
 nlohmann::ordered_json ContentsOf(const TCIMValue& value);
 
+/// A value with its type: { "type": "uint32", "value": 5 }, and with "embedded", its ContentsOf, if it is an embedded object.
+nlohmann::ordered_json JsonWithType(const TCIMValue& value);
+
+/// Adds a list as a member, unless it is empty.
+void AddJsonList(nlohmann::ordered_json& json, const char* name, nlohmann::ordered_json list);
+
 /// The document's text with a line end: indented by two blanks, or in one line. Bytes that are not UTF-8 become U+FFFD.
 std::string WriteJson(const nlohmann::ordered_json& document, bool indented);
 

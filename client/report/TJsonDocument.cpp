@@ -27,38 +27,53 @@ std::string Within(const char* start, const nlohmann::ordered_json& value)
 
 }  // namespace
 
-TJsonDocument::TJsonDocument(TTextSink sink) : fSink(std::move(sink))
+TJsonDocument::TJsonDocument(TTextSink sink, bool isIndented) : fSink(std::move(sink)), fIsIndented(isIndented)
 {
     fSink("{");
 }
 
 void TJsonDocument::Add(const std::string& name, const nlohmann::ordered_json& value)
 {
-    fSink((fIsEmpty ? "" : ",") + (kMemberStart + ("\"" + name + "\": ")) + Within(kMemberStart, value));
+    fSink(MemberBegin(name) + Text(kMemberStart, value));
     fIsEmpty = false;
 }
 
 void TJsonDocument::StartList(const std::string& name)
 {
-    fSink((fIsEmpty ? "" : ",") + (kMemberStart + ("\"" + name + "\": [")));
+    fSink(MemberBegin(name) + "[");
     fIsEmpty = false;
     fIsListEmpty = true;
 }
 
 void TJsonDocument::AddElement(const nlohmann::ordered_json& value)
 {
-    fSink((fIsListEmpty ? "" : ",") + (kElementStart + Within(kElementStart, value)));
+    fSink((fIsListEmpty ? "" : ",") + Text(kElementStart, value));
     fIsListEmpty = false;
 }
 
 void TJsonDocument::EndList()
 {
-    fSink(fIsListEmpty ? "]" : kMemberStart + std::string("]"));
+    fSink(fIsListEmpty || !fIsIndented ? "]" : kMemberStart + std::string("]"));
 }
 
 void TJsonDocument::End()
 {
-    fSink("\n}\n");
+    fSink(fIsIndented ? "\n}\n" : "}\n");
+}
+
+// An element with its start, or a member's value, whose start stands before its name.
+std::string TJsonDocument::Text(const char* start, const nlohmann::ordered_json& value) const
+{
+    if (!fIsIndented) {
+        const std::string text = WriteJson(value, false);
+        return text.substr(0, text.size() - 1);
+    }
+    return (start == kElementStart ? kElementStart : "") + Within(start, value);
+}
+
+std::string TJsonDocument::MemberBegin(const std::string& name) const
+{
+    return std::string(fIsEmpty ? "" : ",") + (fIsIndented ? kMemberStart : "") + "\"" + name + (fIsIndented ? "\": " : "\":");
 }
 
 }  // namespace NORVZEL20

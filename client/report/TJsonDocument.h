@@ -7,14 +7,14 @@
 
 namespace NORVZEL20 {
 
-/// Writes an object as WriteJson(object, true) would, without holding it: its members one after the other, and of a member that is
-/// a list, the elements one after the other.
+/// Writes an object as WriteJson(object, isIndented) would, without holding it: its members one after the other, and of a member
+/// that is a list, the elements one after the other.
 ///
 /// Errors of all operations: what the sink throws; std::bad_alloc. The text has no end then.
 class TJsonDocument {
   public:
     /// Starts the object. Names need no escapes.
-    explicit TJsonDocument(TTextSink sink);
+    explicit TJsonDocument(TTextSink sink, bool isIndented = true);
 
     /// Adds a member.
     void Add(const std::string& name, const nlohmann::ordered_json& value);
@@ -28,7 +28,11 @@ class TJsonDocument {
     void End();
 
   private:
+    std::string Text(const char* start, const nlohmann::ordered_json& value) const;
+    std::string MemberBegin(const std::string& name) const;
+
     const TTextSink fSink;
+    const bool fIsIndented;
     bool fIsEmpty = true;      // whether the object has no member yet
     bool fIsListEmpty = true;  // the same of the list
 };

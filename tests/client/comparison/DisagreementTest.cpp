@@ -32,7 +32,8 @@ TEST_F(DisagreementTest, JsonHasThemInAFieldOfTheirOwn)
     EXPECT_EQ("{\"kind\":\"onlyInOthers\",\"class\":\"User\",\"instance\":\"User.Name=\\\"web\\\"\",\"keys\":{\"Name\":\"web\"},"
               "\"inventories\":[\"b\",\"c\"],\"disagreements\":[{\"property\":\"UID\",\"others\":["
               "{\"inventories\":[\"b\"],\"type\":\"uint32\",\"value\":1004},"
-              "{\"inventories\":[\"c\"],\"type\":\"uint32\",\"value\":0}]}]}\n",
+              "{\"inventories\":[\"c\"],\"type\":\"uint32\",\"value\":0}]}],"
+              "\"contents\":{\"UID\":{\"type\":\"uint32\",\"value\":1004}}}\n",
               Lines({User(), WithUid("1004"), WithUid("0")}));
 }
 
@@ -40,7 +41,7 @@ TEST_F(DisagreementTest, EqualInstancesAreShownByTheirKeyAlone)
 {
     EXPECT_EQ("User\n+ Name=\"web\"  (in b, c)\n", Differences({User(), WithUid("5"), WithUid("5")}));
     EXPECT_EQ("{\"kind\":\"onlyInOthers\",\"class\":\"User\",\"instance\":\"User.Name=\\\"web\\\"\",\"keys\":{\"Name\":\"web\"},"
-              "\"inventories\":[\"b\",\"c\"]}\n",
+              "\"inventories\":[\"b\",\"c\"],\"contents\":{\"UID\":{\"type\":\"uint32\",\"value\":5}}}\n",
               Lines({User(), WithUid("5"), WithUid("5")}));
 }
 

@@ -112,9 +112,10 @@ TEST_F(NothingComparedTest, InventoriesWithoutInstancesAreTheReason)
 
 TEST_F(NothingComparedTest, AnOperatingSystemThatWasMadeIsTheReason)
 {
-    EXPECT_EQ("[2] cimdelta: nothing was compared: KALMO_OperatingSystem is not compared, since cimdelta made an instance of it; name "
-              "inventories with instances, or accept this with --allow-empty\n",
-              Everything(Document(System()), kEmpty));
+    EXPECT_EQ(
+        "[2] cimdelta: nothing was compared: KALMO_OperatingSystem is not compared, since cimdelta made an instance of it; name "
+        "inventories with instances, or accept this with --allow-empty\n",
+        Everything(Document(System()), kEmpty));
 }
 
 TEST_F(NothingComparedTest, AClassWithoutPropertiesToCompareIsTheReason)
@@ -153,7 +154,7 @@ TEST_F(NothingComparedTest, IfItIsAllowedTheResultSaysSo)
         WithRules("", {"--allow-empty"}));
     WithRules("", {"--allow-empty", "-o", "json"});
     const nlohmann::json document = nlohmann::json::parse(fOut);
-    EXPECT_EQ("{\"changedInstances\":0,\"changedValues\":0,\"differences\":0,\"everythingCompared\":false,"
+    EXPECT_EQ("{\"changedInstances\":0,\"changedValues\":0,\"classes\":[],\"differences\":0,\"everythingCompared\":false,"
               "\"instancesOnlyInOthers\":0,\"nothingCompared\":true,"
               "\"onlyInOthers\":0,\"onlyInReference\":0}",
               document["summary"].dump());

@@ -70,10 +70,11 @@ TEST_F(SharedKeyTest, TheReferencesInstanceIsTheFirst)
               Differences({Declared() + OfSize("1", "5") + OfSize("2", "6"), Declared() + OfSize("3", "9")}));
     EXPECT_EQ("Disk\n- Id=\"sda\"  (the first of 2 instances of a with this key; path: root/cimv2:Disk.Boot=\"1\",Id=\"sda\")\n",
               Differences({Declared() + OfSize("1", "5") + OfSize("2", "6"), Declared()}));
-    EXPECT_EQ("{\"kind\":\"onlyInReference\",\"class\":\"Disk\",\"instance\":\"Disk.Id=\\\"sda\\\"\",\"keys\":{\"Id\":\"sda\"},"
-              "\"inventories\":[\"b\"],\"sharing\":[{\"inventory\":\"a\",\"instances\":2}],"
-              "\"path\":\"root/cimv2:Disk.Boot=\\\"1\\\",Id=\\\"sda\\\"\"}\n",
-              Lines({Declared() + OfSize("1", "5") + OfSize("2", "6"), Declared()}));
+    EXPECT_EQ(
+        "{\"kind\":\"onlyInReference\",\"class\":\"Disk\",\"instance\":\"Disk.Id=\\\"sda\\\"\",\"keys\":{\"Id\":\"sda\"},"
+        "\"inventories\":[\"b\"],\"sharing\":[{\"inventory\":\"a\",\"instances\":2}],"
+        "\"path\":\"root/cimv2:Disk.Boot=\\\"1\\\",Id=\\\"sda\\\"\",\"contents\":{\"Size\":{\"type\":\"uint32\",\"value\":5}}}\n",
+        Lines({Declared() + OfSize("1", "5") + OfSize("2", "6"), Declared()}));
 }
 
 TEST_F(SharedKeyTest, OfSeveralInventoriesAPathStandsBehindThoseThatLackIt)
@@ -112,7 +113,8 @@ TEST_F(SharedKeyTest, InstancesThatTheReferenceLacksAreAllNamed)
         "{\"kind\":\"onlyInOthers\",\"class\":\"Disk\",\"instance\":\"Disk.Id=\\\"sda\\\"\",\"keys\":{\"Id\":\"sda\"},"
         "\"inventories\":[\"b\"],\"sharing\":[{\"inventory\":\"b\",\"instances\":2}],\"disagreements\":[{\"property\":\"Size\","
         "\"others\":[{\"inventories\":[\"b\"],\"type\":\"uint32\",\"value\":5,\"sharing\":[{\"inventory\":\"b\",\"instances\":1}]},"
-        "{\"inventories\":[\"b\"],\"type\":\"uint32\",\"value\":6,\"sharing\":[{\"inventory\":\"b\",\"instances\":1}]}]}]}\n",
+        "{\"inventories\":[\"b\"],\"type\":\"uint32\",\"value\":6,\"sharing\":[{\"inventory\":\"b\",\"instances\":1}]}]}],"
+        "\"contents\":{\"Size\":{\"type\":\"uint32\",\"value\":5}}}\n",
         Lines({Declared(), two}));
 }
 

@@ -65,5 +65,20 @@ TEST_F(JsonDocumentTest, WhatIsCompleteIsWrittenAtOnce)
     EXPECT_EQ("{\n  \"a\": 1,\n  \"b\": [\n    2", fWritten);
 }
 
+TEST(CompactJsonDocument, IsOneLine)
+{
+    std::string written;
+    TJsonDocument document([&written](std::string_view piece) { written += piece; }, false);
+    document.Add("a", TJson{{"b", 1}, {"c", {1, 2}}});
+    document.StartList("empty");
+    document.EndList();
+    document.StartList("list");
+    document.AddElement("x");
+    document.AddElement(TJson{{"y", nullptr}});
+    document.EndList();
+    document.End();
+    EXPECT_EQ("{\"a\":{\"b\":1,\"c\":[1,2]},\"empty\":[],\"list\":[\"x\",{\"y\":null}]}\n", written);
+}
+
 }  // namespace
 }  // namespace NORVZEL20
