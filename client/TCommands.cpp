@@ -30,16 +30,15 @@ void AddVersion(CLI::App& app)
     app.set_version_flag("--version", std::string("cimdelta ") + CIMDELTA_VERSION);
 }
 
-void AddFormat(CLI::App* command, EOutputFormat& format)
+void AddFormat(CLI::App* command, EOutputFormat& format, const std::vector<std::string>& names)
 {
-    const std::function<void(const std::string&)> set = [&format](const std::string& name) {
-        const std::vector<std::string> names = OutputFormatNames();
+    const std::function<void(const std::string&)> set = [&format, names](const std::string& name) {
         if (std::find(names.begin(), names.end(), name) == names.end()) {
             throw CLI::ValidationError(name + " is no format; name one: " + Alternatives(names));
         }
         format = OutputFormatOf(name);
     };
-    command->add_option_function("-o,--format", set, Alternatives(OutputFormatNames()) + " (default: text)")
+    command->add_option_function("-o,--format", set, Alternatives(names) + " (default: text)")
         ->transform(&UnguardArgument)
         ->check(&RefuseEmpty)
         ->option_text("FORMAT");
@@ -123,7 +122,7 @@ void TCommands::AddCompare()
     AddText(command, "--spec", fCompare.rules,
             "a rules file that says what to compare, or - for standard input (default: everything)")
         ->option_text("RULES");
-    AddFormat(command, fCompare.format);
+    AddFormat(command, fCompare.format, ReportFormatNames());
     AddLoadingOptions(command, fCompare.loading, kSchemaNames);
     AddSystemNames(command, fCompare.systems);
     AddOutput(command, fCompare.output);
@@ -170,7 +169,7 @@ void TCommands::AddQuery()
     });
     AddText(command, "QUERY", fQuery.query, "WQL: SELECT * | name, ... FROM class [WHERE ...]")->required()->option_text(" ");
     AddText(command, "INVENTORY", fReference, kInventoryHelp)->required()->option_text(" ");
-    AddFormat(command, fQuery.format);
+    AddFormat(command, fQuery.format, ListingFormatNames());
     AddLoadingOptions(command, fQuery.loading, kSchemaNames);
     AddOutput(command, fQuery.output);
 }
@@ -184,7 +183,7 @@ void TCommands::AddShow()
         });
     AddText(command, "INVENTORY", fReference, kInventoryHelp)->required()->option_text(" ");
     AddText(command, "CLASS", fShow.className, "show the instances of this class and of the classes below it")->option_text(" ");
-    AddFormat(command, fShow.format);
+    AddFormat(command, fShow.format, ListingFormatNames());
     AddLoadingOptions(command, fShow.loading, kSchemaNames);
     AddOutput(command, fShow.output);
 }

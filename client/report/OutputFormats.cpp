@@ -9,18 +9,29 @@ namespace {
 const struct {
     const char* name;
     EOutputFormat format;
-} kFormats[] = {{"text", EOutputFormat::kText},
-                {"json", EOutputFormat::kJson},
-                {"ndjson", EOutputFormat::kNdjson},
-                {"cimxml", EOutputFormat::kCimXml}};
+    bool isForListings;
+} kFormats[] = {{"text", EOutputFormat::kText, true},     {"json", EOutputFormat::kJson, true},
+                {"ndjson", EOutputFormat::kNdjson, true}, {"cimxml", EOutputFormat::kCimXml, true},
+                {"csv", EOutputFormat::kCsv, false},      {"markdown", EOutputFormat::kMarkdown, false}};
 
 }  // namespace
 
-std::vector<std::string> OutputFormatNames()
+std::vector<std::string> ReportFormatNames()
 {
     std::vector<std::string> names;
     for (const auto& format : kFormats) {
         names.emplace_back(format.name);
+    }
+    return names;
+}
+
+std::vector<std::string> ListingFormatNames()
+{
+    std::vector<std::string> names;
+    for (const auto& format : kFormats) {
+        if (format.isForListings) {
+            names.emplace_back(format.name);
+        }
     }
     return names;
 }

@@ -23,8 +23,10 @@ class TGroupedText {
     /// The whole text, coverage included. Errors: std::bad_alloc.
     std::string Write() const;
 
-  private:
+    /// Its first line, the verdict: who is compared, and how many differences there are. Without a line end or colours.
     std::string Summary() const;
+
+  private:
     std::string Counts() const;
     std::string WhoDiffers() const;
     std::string Findings() const;

@@ -2,7 +2,9 @@
 
 #include "client/findings/CollectFindings.h"
 #include "client/report/CimXmlFormat.h"
+#include "client/report/CsvFormat.h"
 #include "client/report/JsonFormat.h"
+#include "client/report/MarkdownFormat.h"
 #include "client/report/TGroupedText.h"
 #include "client/report/TTextFormat.h"
 
@@ -32,6 +34,10 @@ void WriteReport(const TComparisonReport& report, EOutputFormat format, const TT
         return WriteNdjsonReport(report, sink);
     case EOutputFormat::kCimXml:
         return WriteCimXmlReport(report, sink);
+    case EOutputFormat::kCsv:
+        return WriteCsvReport(report, sink);
+    case EOutputFormat::kMarkdown:
+        return WriteMarkdownReport(report, options, sink);
     }
 }
 

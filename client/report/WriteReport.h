@@ -7,7 +7,7 @@
 
 namespace NORVZEL20 {
 
-/// Hands the report to `sink` in that format, piece by piece. `options` matter to text alone. Errors: those of
+/// Hands the report to `sink` in that format, piece by piece. `options` matter to text and Markdown alone. Errors: those of
 /// IDifferences::ForEach; what the sink throws.
 void WriteReport(const TComparisonReport& report, EOutputFormat format, const TTextOptions& options, const TTextSink& sink);
 

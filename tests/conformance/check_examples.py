@@ -23,7 +23,7 @@ def output(root, cimdelta, folder, arguments):
     result = subprocess.run([cimdelta, *shlex.split(arguments)], cwd=root / folder, env=environment, stdout=subprocess.PIPE, check=False)
     if result.returncode not in (0, 1):
         sys.exit(f"cimdelta {arguments}: ended with status {result.returncode}")
-    return result.stdout.decode()
+    return result.stdout.decode().replace("\r\n", "\n")  # CSV ends lines so
 
 
 def pattern(lines):

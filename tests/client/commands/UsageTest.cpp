@@ -86,8 +86,8 @@ TEST_F(UsageTest, WrongUsageIsReportedInOneLine)
         {{"show", "-o", "json", "--format=json", "web01.xml"}, "-o,--format can be given only once; see cimdelta show --help"},
         {{"compare", "web01.xml", "web02.xml", "--spec"}, "--spec needs a value; see cimdelta compare --help"},
         {{"show", "web01.xml", "-o"}, "-o,--format needs a value; see cimdelta show --help"},
-        {{"compare", "-o", "html", "web01.xml", "web02.xml"},
-         "html is no format; name one: text, json, ndjson or cimxml; see cimdelta compare --help"},
+        {{"compare", "-o", "xls", "web01.xml", "web02.xml"},
+         "xls is no format; name one: text, json, ndjson, cimxml, csv or markdown; see cimdelta compare --help"},
     };
     for (const auto& row : rows) {
         EXPECT_EQ("cimdelta: " + row.message + "\n", Complaint(row.arguments));

@@ -9,11 +9,14 @@ namespace {
 
 TEST(OutputFormats, HaveNamesInTheOrderOfMessages)
 {
-    EXPECT_EQ((std::vector<std::string>{"text", "json", "ndjson", "cimxml"}), OutputFormatNames());
+    EXPECT_EQ((std::vector<std::string>{"text", "json", "ndjson", "cimxml", "csv", "markdown"}), ReportFormatNames());
+    EXPECT_EQ((std::vector<std::string>{"text", "json", "ndjson", "cimxml"}), ListingFormatNames());
     EXPECT_EQ(EOutputFormat::kText, OutputFormatOf("text"));
     EXPECT_EQ(EOutputFormat::kJson, OutputFormatOf("json"));
     EXPECT_EQ(EOutputFormat::kNdjson, OutputFormatOf("ndjson"));
     EXPECT_EQ(EOutputFormat::kCimXml, OutputFormatOf("cimxml"));
+    EXPECT_EQ(EOutputFormat::kCsv, OutputFormatOf("csv"));
+    EXPECT_EQ(EOutputFormat::kMarkdown, OutputFormatOf("markdown"));
 }
 
 TEST(OutputFormats, OtherNamesAreRefused)

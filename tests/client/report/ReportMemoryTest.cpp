@@ -70,7 +70,8 @@ class ReportMemoryTest : public TClientFixture {
     std::string fOther = "another value in the other one";
 };
 
-const EOutputFormat kFormats[] = {EOutputFormat::kText, EOutputFormat::kJson, EOutputFormat::kNdjson, EOutputFormat::kCimXml};
+const EOutputFormat kFormats[] = {EOutputFormat::kText, EOutputFormat::kJson, EOutputFormat::kNdjson, EOutputFormat::kCimXml,
+                                  EOutputFormat::kCsv};
 
 // Each property that changed is a group with examples, which JSON holds from the beginning.
 std::size_t GroupsOf(EOutputFormat format, int changed)
@@ -96,7 +97,7 @@ TEST_F(ReportMemoryTest, MoreDifferencesTakeNoMoreMemory)
 
 TEST_F(ReportMemoryTest, AnInstanceMoreTakesItsEntryInAnIndexOfEachInventory)
 {
-    for (const EOutputFormat format : {EOutputFormat::kText, EOutputFormat::kJson, EOutputFormat::kNdjson}) {
+    for (const EOutputFormat format : {EOutputFormat::kText, EOutputFormat::kJson, EOutputFormat::kNdjson, EOutputFormat::kCsv}) {
         const std::size_t peakOfFew = PeakOfWriting(format, kInstances, 1);
         const std::size_t peakOfMany = PeakOfWriting(format, 5 * kInstances, 1);
         // 24 bytes for an entry, and while the second index is made and sorted, as many again and a list of the instances.

@@ -1,0 +1,154 @@
+// A report of three inventories looks like this:
+//
+//   ## web01 against 2 others: 44 differences; both differ
+//
+//   | differences | inventories |
+//   | ---: | --- |
+//   | 43 | `web02` |
+//   | 1 | `web03` |
+//
+//   ### Package -1 ~43
+//
+//   - `missing in web03: telnet`
+//
+//   <details><summary><code>Version in 43 instances (web02), 43 distinct changes</code></summary>
+//
+//   - `bash.Version: 5.1 -> 5.2 (web02)`
+//   ...
+//   </details>
+//
+//   330 to 332 instances of each in 9 classes compared
+//
+// A group that the text would shorten is folded, with all of its examples in it. What comes from inventories stands as code, in
+// which nothing has a meaning, except in headings and in the last lines, where it is escaped.
+#include "client/report/MarkdownFormat.h"
+
+#include <boost/algorithm/string/classification.hpp>
+#include <boost/algorithm/string/predicate.hpp>
+#include <boost/algorithm/string/split.hpp>
+#include <map>
+#include <string>
+#include <vector>
+
+#include "client/findings/CollectFindings.h"
+#include "client/report/MarkdownText.h"
+#include "client/report/ShortCoverage.h"
+#include "client/report/TClassLines.h"
+#include "client/report/TGroupedText.h"
+#include "client/report/TInventoryNames.h"
+#include "client/report/TextCoverage.h"
+#include "client/text/DisplayText.h"
+
+namespace NORVZEL20 {
+
+namespace {
+
+// Members of a group that are shown without unfolding it.
+constexpr std::size_t kMostShown = 8;
+
+class TMarkdown {
+  public:
+    TMarkdown(const TComparisonReport& report, const TFindings& findings, const TTextOptions& options)
+        : fReport(report), fFindings(findings), fOptions(options), fNames(report.labels)
+    {}
+
+    void Write(const TTextSink& sink) const
+    {
+        sink("## " + EscapeForMarkdown(TGroupedText(fReport, fFindings, fOptions).Summary()) + "\n\n");
+        if (!IsPair()) {
+            sink(Inventories());
+        }
+        for (const TClassFindings& findings : fFindings.classes) {
+            sink(Class(findings));
+        }
+        sink(Coverage());
+    }
+
+  private:
+    bool IsPair() const { return fReport.labels.size() == 2; }
+
+    // The other inventories by their number of differences, most first.
+    std::string Inventories() const
+    {
+        std::map<std::size_t, std::vector<std::size_t>, std::greater<>> byCount;
+        for (std::size_t i = 1; i < fFindings.differences.size(); ++i) {
+            byCount[fFindings.differences[i]].push_back(i);
+        }
+        std::string table = "| differences | inventories |\n| ---: | --- |\n";
+        for (const auto& [count, inventories] : byCount) {
+            table += "| " + std::to_string(count) + " | " + MarkdownCode(fNames.List(inventories)) + " |\n";
+        }
+        return table + "\n";
+    }
+
+    std::string Class(const TClassFindings& findings) const
+    {
+        std::string text = "### " +
+                           EscapeForMarkdown(EscapeForDisplay(findings.className) + " " +
+                                             TClassLines(findings, fNames, fOptions, IsPair(), kMostShown).Counts()) +
+                           "\n\n";
+        for (const TPresenceFinding& presence : findings.presences) {
+            TClassFindings part;
+            part.presences.push_back(presence);
+            AddPart(text, part);
+        }
+        for (const TPropertyFinding& property : findings.properties) {
+            TClassFindings part;
+            part.properties.push_back(property);
+            AddPart(text, part);
+        }
+        EndParagraph(text);
+        return text;
+    }
+
+    // One finding: a list, folded if the text would shorten it.
+    void AddPart(std::string& text, const TClassFindings& part) const
+    {
+        const std::vector<TClassLines::TLine> shortened = TClassLines(part, fNames, fOptions, IsPair(), kMostShown).Write();
+        const std::vector<TClassLines::TLine> whole = TClassLines(part, fNames, fOptions, IsPair(), kMostExamples).Write();
+        std::string list;
+        for (const TClassLines::TLine& line : whole) {
+            list += "- " + MarkdownCode(line.contents.empty() ? line.text : line.text + "   " + line.contents) + "\n";
+        }
+        if (whole.size() == shortened.size() && whole.front().text == shortened.front().text) {
+            text += list;
+            return;
+        }
+        EndParagraph(text);
+        text += "<details><summary>" + HtmlCode(shortened.front().text) + "</summary>\n\n" + list + "\n</details>\n\n";
+    }
+
+    static void EndParagraph(std::string& text) { text += boost::algorithm::ends_with(text, "\n\n") ? "" : "\n"; }
+
+    std::string Coverage() const
+    {
+        if (fOptions.hasWholeCoverage) {
+            return "<details><summary>What was compared</summary>\n\n" + MarkdownBlock(WriteTextCoverage(fReport)) +
+                   "\n</details>\n";
+        }
+        std::vector<std::string> lines;
+        const std::string text = WriteShortCoverage(fReport);
+        boost::algorithm::split(lines, text, boost::algorithm::is_any_of("\n"));
+        lines.pop_back();
+        std::string coverage;
+        for (const std::string& line : lines) {
+            coverage += (coverage.empty() ? "" : "\n") + EscapeForMarkdown(line) + "\n";
+        }
+        return coverage;
+    }
+
+    const TComparisonReport& fReport;
+    const TFindings& fFindings;
+    const TTextOptions& fOptions;
+    const TInventoryNames fNames;
+};
+
+}  // namespace
+
+void WriteMarkdownReport(const TComparisonReport& report, const TTextOptions& options, const TTextSink& sink)
+{
+    const TFindings findings = CollectFindings(report);
+    TMarkdown(report, findings, options).Write(sink);
+}
+
+}  // namespace NORVZEL20
