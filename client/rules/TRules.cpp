@@ -21,6 +21,7 @@ TRules::TRules(boost::shared_ptr<ICIMNamespace> schema, const TRulesText& text)
     parser.Read(text);
     fRuleset = parser.getRuleset();
     fDocument = parser.GetDocument();
+    fText = text.text;
 }
 
 std::vector<std::string> TRules::PropertiesOf(const boost::shared_ptr<ICIMClass>& cls)

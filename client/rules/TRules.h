@@ -50,6 +50,9 @@ class TRules {
     /// Whether any class excludes any key.
     bool HasExcludedKeys() const;
 
+    /// The rules as the plug-in reads them.
+    const std::string& GetText() const { return fText; }
+
     /// What the rules say, element by element.
     const TRulesDocument& GetDocument() const { return fDocument; }
 
@@ -60,6 +63,7 @@ class TRules {
     TCIMDiffEngine fEngine;
     TCIMDiffEngine::TRuleset fRuleset;
     TRulesDocument fDocument;
+    std::string fText;
     std::string fFoundName;  // the class looked up last; instances come class by class
     boost::shared_ptr<TCIMDiffEngine::TDiffClassRules> fFound;
 };
