@@ -4,6 +4,7 @@
 #include <memory>
 
 #include "client/AddLoadingOptions.h"
+#include "client/AddReferenceOptions.h"
 #include "client/AddReportOptions.h"
 #include "client/AddSystemNames.h"
 #include "client/AddText.h"
@@ -127,6 +128,7 @@ void TCommands::AddCompare()
     AddSystemNames(command, fCompare.systems);
     AddOutput(command, fCompare.output);
     AddStrictSchema(command, fCompare.strictSchema);
+    AddReferenceOptions(command, fCompare);
     AddReportOptions(command, fCompare.text);
     command->add_flag("--allow-empty", fCompare.allowEmpty, "do not take it for an error if nothing was compared");
 }

@@ -1,5 +1,6 @@
 #include "client/commands/CompareCommand.h"
 
+#include "client/comparison/SeeFromMajority.h"
 #include "client/comparison/TComparison.h"
 #include "client/inventory/AlignSystemNames.h"
 #include "client/inventory/TInventoryLoader.h"
@@ -33,12 +34,16 @@ int RunCompare(const TCompareOptions& options, IConsole& console)
 {
     // Before the inventories, which may take long to load.
     CheckSystemNames(options.systems);
+    const std::vector<TInventorySources> sources = options.reference.Apply(options.inventories, options.format);
     const std::optional<TRulesText> rules = ReadRulesIfAny(options.rules);
-    std::vector<TInventory> inventories = TInventoryLoader(console, options.loading).Load(options.inventories);
+    std::vector<TInventory> inventories = TInventoryLoader(console, options.loading).Load(sources);
     AlignSystemNames(inventories, options.systems);
-    const TComparisonReport report = TComparison(inventories, console).Run(rules, options.strictSchema);
+    TComparisonReport report = TComparison(inventories, console).Run(rules, options.strictSchema);
     if (!options.allowEmpty && report.coverage.IsNothingCompared()) {
         throw TClientError(DescribeNothingCompared(report, inventories, options.rules, options.strictSchema));
+    }
+    if (options.reference.WantsMajority()) {
+        report = SeeFromMajority(report);
     }
     Deliver(report, options, console);
     return report.differences->GetCounts().GetTotal() == 0 ? kExitSuccess : kExitDifferences;

@@ -3,6 +3,7 @@
 #include <string>
 #include <vector>
 
+#include "client/commands/TReferenceChoice.h"
 #include "client/inventory/TInventorySources.h"
 #include "client/inventory/TLoadingOptions.h"
 #include "client/inventory/TSystemNames.h"
@@ -14,8 +15,9 @@ namespace NORVZEL20 {
 
 /// The arguments of `cimdelta compare`.
 struct TCompareOptions {
-    std::vector<TInventorySources> inventories;  ///< at least two, the reference first
-    std::string rules;                           ///< empty: everything is compared
+    std::vector<TInventorySources> inventories;  ///< at least two, in the order of the command line
+    TReferenceChoice reference;
+    std::string rules;  ///< empty: everything is compared
     EOutputFormat format = EOutputFormat::kText;
     TTextOptions text;   ///< whether it is coloured is found out by the command
     std::string output;  ///< empty: standard output

@@ -23,6 +23,10 @@ struct TComparisonReport {
     const std::vector<TInventory>* inventories;  ///< those that were compared; they must outlive this
     boost::shared_ptr<TDeltaNamespace> records;  ///< the delta namespace of the run
     std::shared_ptr<IDifferences> differences;   ///< what the records stand for; reads the inventories
+    /// If the reference is what most inventories have (see SeeFromMajority): the report of the run, which says what was compared,
+    /// and `inventories`. Otherwise null.
+    std::shared_ptr<const TComparisonReport> run = nullptr;
+    std::shared_ptr<const std::vector<TInventory>> majority = nullptr;
 };
 
 }  // namespace NORVZEL20

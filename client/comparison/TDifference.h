@@ -26,8 +26,8 @@ struct TDifference {
     std::vector<std::pair<std::string, TCIMValue>> keys;  ///< the same, key by key, in the class's order
     std::string path;                      ///< only of kOnlyInReference, if the rules of the class exclude keys: the whole path
     std::vector<std::size_t> inventories;  ///< the positions of those that differ, ascending, each once
-    /// For each inventory of the run, how many instances have the key. Only the reference and `inventories` are counted. Empty if
-    /// the rules exclude no key, so no two instances share one.
+    /// For each inventory of the run, how many instances have the key. Empty if the rules exclude no key, so no two instances share
+    /// one.
     std::vector<std::size_t> sharing;
     /// Of kChanged: the property, and nothing else. Of kOnlyInOthers: each compared property in which the instances of
     /// `inventories` differ from one another, ascending by name.

@@ -261,11 +261,8 @@ void TDifferenceReader::CountSharing(TDifference& difference)
         return;
     }
     difference.sharing.assign(fInventories.size(), 0);
-    for (const std::size_t inventory : difference.inventories) {
-        difference.sharing[inventory] = Index(inventory).Find(difference.instance).size();
-    }
-    if (difference.kind != TDifference::kOnlyInOthers) {
-        difference.sharing[0] = Index(0).Find(difference.instance).size();
+    for (std::size_t i = difference.kind == TDifference::kOnlyInOthers ? 1 : 0; i < fInventories.size(); ++i) {
+        difference.sharing[i] = Index(i).Find(difference.instance).size();
     }
 }
 

@@ -61,7 +61,9 @@ class TDifferenceWriter {
     void AddSharing(TJson& json) const
     {
         TJson sharing = TJson::array();
-        for (std::size_t i = 0; i < fDifference.sharing.size(); ++i) {
+        std::vector<std::size_t> inventories = fDifference.inventories;
+        inventories.insert(inventories.begin(), 0);
+        for (const std::size_t i : inventories) {
             if (fDifference.CountSharing(i) > 0) {
                 sharing.push_back(Sharing(i, fDifference.CountSharing(i)));
             }

@@ -153,6 +153,9 @@ std::string Reservations(const TComparisonReport& report)
 
 std::string WriteShortCoverage(const TComparisonReport& report)
 {
+    if (report.run) {
+        return WriteShortCoverage(*report.run);
+    }
     return Compared(report) + NotCompared(report) + Reservations(report) +
            (report.coverage.hint ? DescribeNameHint(*report.coverage.hint) + "\n" : std::string());
 }

@@ -353,6 +353,9 @@ class TStatement {
 
 std::string WriteTextCoverage(const TComparisonReport& report)
 {
+    if (report.run) {
+        return WriteTextCoverage(*report.run);
+    }
     return TStatement(report).Write();
 }
 

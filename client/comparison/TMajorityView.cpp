@@ -1,0 +1,73 @@
+#include "client/comparison/TMajorityView.h"
+
+#include <utility>
+
+#include "client/comparison/TInstanceVotes.h"
+
+namespace NORVZEL20 {
+
+TMajorityView::TMajorityView(std::shared_ptr<IDifferences> differences, const std::vector<TInventory>& inventories,
+                             const TCoverage& coverage)
+    : fDifferences(std::move(differences)), fInventories(inventories)
+{
+    for (const TCoverage::TClass& cls : coverage.classes) {
+        if (!cls.madeIn.empty()) {
+            fUncompared.emplace(cls.name, cls.madeIn);
+        }
+    }
+    Count();
+}
+
+void TMajorityView::Count()
+{
+    std::string className;
+    std::string changed;  // the instance of the last changed value
+    ForEach([&](const TDifference& difference) {
+        switch (difference.kind) {
+        case TDifference::kOnlyInReference:
+            ++fCounts.onlyInReference;
+            break;
+        case TDifference::kOnlyInOthers:
+            ++fCounts.onlyInOthers;
+            fCounts.instancesOnlyInOthers += difference.CountInstances();
+            break;
+        case TDifference::kChanged:
+            ++fCounts.changedValues;
+            fCounts.changedInstances += className == difference.className && changed == difference.instance ? 0 : 1;
+            className = difference.className;
+            changed = difference.instance;
+        }
+    });
+}
+
+void TMajorityView::ForEach(const TCallback& callback)
+{
+    std::vector<TDifference> ofInstance;
+    const auto handOn = [&] {
+        for (const TDifference& difference : FromMajority(ofInstance)) {
+            callback(difference);
+        }
+        ofInstance.clear();
+    };
+    fDifferences->ForEach([&](const TDifference& difference) {
+        if (!ofInstance.empty() &&
+            (ofInstance.front().className != difference.className || ofInstance.front().instance != difference.instance)) {
+            handOn();
+        }
+        ofInstance.push_back(difference);
+    });
+    handOn();
+}
+
+std::vector<TDifference> TMajorityView::FromMajority(const std::vector<TDifference>& ofInstance) const
+{
+    if (ofInstance.empty()) {
+        return {};
+    }
+    const auto uncompared = fUncompared.find(ofInstance.front().className);
+    return TInstanceVotes(ofInstance, fInventories,
+                          uncompared == fUncompared.end() ? std::vector<std::size_t>() : uncompared->second)
+        .Differ();
+}
+
+}  // namespace NORVZEL20
