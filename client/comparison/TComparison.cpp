@@ -100,6 +100,8 @@ TComparisonReport TComparison::RunWith(const std::shared_ptr<TRules>& rules, con
     TComparisonReport report;
     report.inventories = &fInventories;
     report.rules = text.name;
+    report.rulesText = text.text;
+    report.areRulesMade = text.isMade;
     for (const TInventory& inventory : fInventories) {
         report.labels.push_back(inventory.label);
         report.paths.push_back(inventory.path);

@@ -18,6 +18,8 @@ struct TComparisonReport {
     std::vector<std::string> paths;   ///< of the inventories, in the same order
     std::vector<TLoadReport> loads;   ///< what was found when they were loaded, in the same order
     std::string rules;                ///< what messages call the rules
+    std::string rulesText;            ///< their whole document
+    bool areRulesMade = false;        ///< whether the person named no rules
     TCoverage coverage;
     std::vector<std::string> idleRules;  ///< the classes that a rules file names although no inventory has instances of their trees
     const std::vector<TInventory>* inventories;  ///< those that were compared; they must outlive this

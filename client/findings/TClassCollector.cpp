@@ -8,43 +8,14 @@
 
 #include <algorithm>
 #include <functional>
-#include <set>
 #include <tuple>
 #include <utility>
 
-#include "client/text/DisplayText.h"
-#include "embedded/value/TValueText.h"
+#include "client/findings/ChangeIdentity.h"
 
 namespace NORVZEL20 {
 
 namespace {
-
-std::string WholeText(const TCIMValue& value)
-{
-    return TValueText::DescribeType(value.GetType()) + (value.IsBag() ? " bag " : " ") + DisplayValue(value);
-}
-
-std::string WholeText(const TValueDifference& change)
-{
-    std::string text = WholeText(change.reference);
-    for (const TValueDifference::TGroup& group : change.others) {
-        text += '\n' + WholeText(group.value);
-        for (std::size_t i = 0; i < group.inventories.size(); ++i) {
-            text += ' ' + std::to_string(group.inventories[i]) + 'x' + std::to_string(group.CountInstances(i));
-        }
-    }
-    return text;
-}
-
-// Those whose value changed, ascending.
-std::vector<std::size_t> InventoriesOf(const TValueDifference& change)
-{
-    std::set<std::size_t> inventories;
-    for (const TValueDifference::TGroup& group : change.others) {
-        inventories.insert(group.inventories.begin(), group.inventories.end());
-    }
-    return {inventories.begin(), inventories.end()};
-}
 
 bool SharesKey(const TDifference& difference)
 {

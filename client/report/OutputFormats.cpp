@@ -12,7 +12,8 @@ const struct {
     bool isForListings;
 } kFormats[] = {{"text", EOutputFormat::kText, true},     {"json", EOutputFormat::kJson, true},
                 {"ndjson", EOutputFormat::kNdjson, true}, {"cimxml", EOutputFormat::kCimXml, true},
-                {"csv", EOutputFormat::kCsv, false},      {"markdown", EOutputFormat::kMarkdown, false}};
+                {"csv", EOutputFormat::kCsv, false},      {"markdown", EOutputFormat::kMarkdown, false},
+                {"html", EOutputFormat::kHtml, false}};
 
 }  // namespace
 

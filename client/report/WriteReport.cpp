@@ -7,6 +7,7 @@
 #include "client/report/MarkdownFormat.h"
 #include "client/report/TGroupedText.h"
 #include "client/report/TTextFormat.h"
+#include "client/report/html/HtmlFormat.h"
 
 namespace NORVZEL20 {
 
@@ -38,6 +39,8 @@ void WriteReport(const TComparisonReport& report, EOutputFormat format, const TT
         return WriteCsvReport(report, sink);
     case EOutputFormat::kMarkdown:
         return WriteMarkdownReport(report, options, sink);
+    case EOutputFormat::kHtml:
+        return WriteHtmlReport(report, sink);
     }
 }
 

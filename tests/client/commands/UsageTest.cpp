@@ -87,7 +87,7 @@ TEST_F(UsageTest, WrongUsageIsReportedInOneLine)
         {{"compare", "web01.xml", "web02.xml", "--spec"}, "--spec needs a value; see cimdelta compare --help"},
         {{"show", "web01.xml", "-o"}, "-o,--format needs a value; see cimdelta show --help"},
         {{"compare", "-o", "xls", "web01.xml", "web02.xml"},
-         "xls is no format; name one: text, json, ndjson, cimxml, csv or markdown; see cimdelta compare --help"},
+         "xls is no format; name one: text, json, ndjson, cimxml, csv, markdown or html; see cimdelta compare --help"},
     };
     for (const auto& row : rows) {
         EXPECT_EQ("cimdelta: " + row.message + "\n", Complaint(row.arguments));

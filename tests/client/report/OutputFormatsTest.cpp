@@ -9,7 +9,7 @@ namespace {
 
 TEST(OutputFormats, HaveNamesInTheOrderOfMessages)
 {
-    EXPECT_EQ((std::vector<std::string>{"text", "json", "ndjson", "cimxml", "csv", "markdown"}), ReportFormatNames());
+    EXPECT_EQ((std::vector<std::string>{"text", "json", "ndjson", "cimxml", "csv", "markdown", "html"}), ReportFormatNames());
     EXPECT_EQ((std::vector<std::string>{"text", "json", "ndjson", "cimxml"}), ListingFormatNames());
     EXPECT_EQ(EOutputFormat::kText, OutputFormatOf("text"));
     EXPECT_EQ(EOutputFormat::kJson, OutputFormatOf("json"));
@@ -17,6 +17,7 @@ TEST(OutputFormats, HaveNamesInTheOrderOfMessages)
     EXPECT_EQ(EOutputFormat::kCimXml, OutputFormatOf("cimxml"));
     EXPECT_EQ(EOutputFormat::kCsv, OutputFormatOf("csv"));
     EXPECT_EQ(EOutputFormat::kMarkdown, OutputFormatOf("markdown"));
+    EXPECT_EQ(EOutputFormat::kHtml, OutputFormatOf("html"));
 }
 
 TEST(OutputFormats, OtherNamesAreRefused)

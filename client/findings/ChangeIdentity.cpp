@@ -1,0 +1,40 @@
+#include "client/findings/ChangeIdentity.h"
+
+#include <set>
+
+#include "client/text/DisplayText.h"
+#include "embedded/value/TValueText.h"
+
+namespace NORVZEL20 {
+
+namespace {
+
+std::string WholeTextOf(const TCIMValue& value)
+{
+    return TValueText::DescribeType(value.GetType()) + (value.IsBag() ? " bag " : " ") + DisplayValue(value);
+}
+
+}  // namespace
+
+std::string WholeText(const TValueDifference& change)
+{
+    std::string text = WholeTextOf(change.reference);
+    for (const TValueDifference::TGroup& group : change.others) {
+        text += '\n' + WholeTextOf(group.value);
+        for (std::size_t i = 0; i < group.inventories.size(); ++i) {
+            text += ' ' + std::to_string(group.inventories[i]) + 'x' + std::to_string(group.CountInstances(i));
+        }
+    }
+    return text;
+}
+
+std::vector<std::size_t> InventoriesOf(const TValueDifference& change)
+{
+    std::set<std::size_t> inventories;
+    for (const TValueDifference::TGroup& group : change.others) {
+        inventories.insert(group.inventories.begin(), group.inventories.end());
+    }
+    return {inventories.begin(), inventories.end()};
+}
+
+}  // namespace NORVZEL20

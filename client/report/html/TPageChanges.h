@@ -1,0 +1,36 @@
+#pragma once
+
+#include <cstdint>
+#include <string>
+#include <vector>
+
+#include "client/comparison/TValueDifference.h"
+#include "client/report/TInventoryNames.h"
+#include "client/report/html/TPageData.h"
+
+namespace NORVZEL20 {
+
+/// Writes values that differ into the columns of a page.
+class TPageChanges {
+  public:
+    /// Both must outlive this.
+    TPageChanges(TPageData& data, const std::vector<std::string>& labels) : fData(data), fNames(labels) {}
+
+    /// Adds a change and returns its number. Without `hasReference`, the reference lacks the instance.
+    std::uint32_t Add(const TValueDifference& change, bool hasReference);
+    /// Adds a list of numbers and returns its number; 0 is the empty list.
+    std::uint32_t AddList(const std::vector<std::size_t>& numbers);
+    /// What is shown of the change before the rows are unpacked.
+    void Describe(const TValueDifference& change, TPageFinding::TExample& example);
+
+  private:
+    std::string ShortText(const TValueDifference& change, const std::string& reference, const std::string& other) const;
+
+    TPageData& fData;
+    const TInventoryNames fNames;
+};
+
+/// The beginning of a text that may be long, for a line.
+std::string CutForLine(const std::string& text);
+
+}  // namespace NORVZEL20
