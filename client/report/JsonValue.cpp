@@ -21,6 +21,9 @@ TJson JsonOfReal(const TCIMValue& value)
     if (!std::isfinite(real)) {
         return value.ToText();
     }
+    if (real == 0 && std::signbit(real)) {
+        return TJson(real);  // as an integer, it would lose its sign
+    }
     // The library writes the shortest text that gives a real64 back, for 0.1f that is 0.10000000149011612. ToText knows that the
     // value is a real32, and gives "0.1".
     return value.GetType() == TCIMValue::TCIMType::kReal32 ? TJson::parse(value.ToText(), nullptr, false) : TJson(real);
