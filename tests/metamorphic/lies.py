@@ -51,11 +51,16 @@ def on_report(change):
 
 def without_first_line(output_format, pattern):
     """A lie that leaves out the first line, or element, that matches."""
+    return with_first(output_format, pattern, b"")
+
+
+def with_first(output_format, pattern, replacement):
+    """A lie that replaces the first text that matches."""
 
     def lie(result, arguments, _documents):
         if arguments[0] != "compare" or (output_format not in arguments):
             return None
-        return dataclasses.replace(result, output=re.sub(pattern, b"", result.output, count=1))
+        return dataclasses.replace(result, output=re.sub(pattern, replacement, result.output, count=1))
 
     return lie
 
@@ -106,6 +111,40 @@ def invent_if(condition):
 
 def drop_if(condition):
     return lambda report, documents: condition([data for _, data in documents]) and drop_difference(report, documents)
+
+
+def change_group(field, change):
+    """A lie about the first group that has the field."""
+
+    def lie(report, _documents):
+        groups = [one for one in report["groups"] if field in one]
+        for one in groups[:1]:
+            one[field] = change(one[field])
+        return bool(groups)
+
+    return on_report(lie)
+
+
+def drop_group(report, _documents):
+    return bool(report["groups"]) and bool(report["groups"].pop())
+
+
+def miscount_inventory(report, _documents):
+    report["inventories"][-1]["differences"] += 1
+    return True
+
+
+def invent_field(report, _documents):
+    for one in report["differences"][:1]:
+        one["severity"] = 5
+    return bool(report["differences"])
+
+
+def lose_field(report, _documents):
+    found = [one for one in report["differences"] if "contents" in one]
+    for one in found[:1]:
+        del one["contents"]
+    return bool(found)
 
 
 def drop_new_instances(report, _documents):
@@ -178,6 +217,22 @@ LIES = [
     ("entities of rules are not read", relations.rules_may_be_written_otherwise, LyingProgram, on_encoded_rules),
     ("explain includes all", relations.explain_says_what_is_compared, LyingProgram, explain_all),
     ("a line is missing", relations.formats_agree, LyingProgram, without_first_line("ndjson", rb'\{"kind":"[a-z]*[^\n]*\n')),
-    ("a line of text is missing", relations.formats_agree, LyingProgram, without_first_line("text", rb"\n[-+~] [^\n]*")),
     ("a record is missing", relations.formats_agree, LyingProgram, without_first_line("cimxml", RECORD)),
+    ("an instance is missing", relations.detail_says_what_json_says, LyingProgram, without_first_line("text", rb"\n[-+~] [^\n]*")),
+    ("a property is missing", relations.detail_says_what_json_says, LyingProgram, without_first_line("text", rb"\n    [^\n]*")),
+    ("values change places", relations.detail_says_what_json_says, LyingProgram, with_first("text", rb"(\S+) -> (\w+): (\S+)", rb"\3 -> \2: \1")),
+    ("another inventory is named", relations.detail_says_what_json_says, LyingProgram, with_first("text", rb"-> b: ", rb"-> c: ")),
+    ("a line says nothing", relations.detail_says_what_json_says, LyingProgram, with_first("text", rb"\n    ", rb"\nperhaps\n    ")),
+    ("a row is missing", relations.csv_says_what_json_says, LyingProgram, without_first_line("csv", rb"\n[^\n]*,[cC]hanged,[^\n]*")),
+    ("a cell is another", relations.csv_says_what_json_says, LyingProgram, with_first("csv", rb",(\w+),string,", rb",\1x,string,")),
+    ("a group is missing", relations.groups_hold_the_differences, LyingProgram, on_report(drop_group)),
+    ("a group counts too many", relations.groups_hold_the_differences, LyingProgram, change_group("instances", lambda count: count + 1)),
+    ("a change counts twice", relations.groups_hold_the_differences, LyingProgram, change_group("distinctChanges", lambda count: count + 1)),
+    ("an example is of no use", relations.groups_hold_the_differences, LyingProgram, change_group("examples", lambda _: ["x"])),
+    ("an inventory has more", relations.groups_hold_the_differences, LyingProgram, on_report(miscount_inventory)),
+    ("a class has other counts", relations.groups_hold_the_differences, LyingProgram, with_first("text", rb"\n(\S+ +[-+~])\d", rb"\n\g<1>7")),
+    ("a heading is missing", relations.groups_hold_the_differences, LyingProgram, without_first_line("markdown", rb"### [^\n]*\n")),
+    ("a field is new", relations.follows_the_schema, LyingProgram, on_report(invent_field)),
+    ("a field is missing", relations.follows_the_schema, LyingProgram, on_report(lose_field)),
+    ("a line is of no kind", relations.follows_the_schema, LyingProgram, with_first("ndjson", rb'"kind":"[a-zA-Z]*"', rb'"kind":"moved"')),
 ]

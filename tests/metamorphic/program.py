@@ -68,6 +68,12 @@ class Program:
             raise Refusal(f"compare ended with status {result.status}: {result.messages.strip()[-600:]}")
         return result
 
+    def grouped(self, inventories, rules=None, output_format="text"):
+        """The report as it is without --detail."""
+        documents = list(inventories) + ([("rules.xml", rules)] if rules is not None else [])
+        arguments = ["compare", "--allow-empty", "-o", output_format, *(["--spec", "rules.xml"] if rules is not None else [])]
+        return self.run([*arguments, *(name for name, _ in inventories)], documents).output.decode()
+
     def status(self, inventories, rules=None):
         """The exit status of a comparison without options."""
         documents = list(inventories) + ([("rules.xml", rules)] if rules is not None else [])

@@ -11,11 +11,14 @@ import re
 from lxml import etree
 
 import checker
+import detailed_report
 import differences as d
+import grouped_report
 import inventory
 import program
 import rewriting
-import text_report
+import schema
+import table_report
 import values
 
 
@@ -306,11 +309,28 @@ def formats_agree(case):
     if lines[:-1] != report["differences"]:
         yield "ndjson: other differences than in JSON"
     ending = dict(lines[-1])
-    right = {"inventories": report["inventories"], "summary": report["summary"], **report["coverage"]}
+    right = {**{name: report[name] for name in ("inventories", "summary", "groups")}, **report["coverage"]}
     if ending.pop("kind") != "coverage" or ending != right:
         yield "ndjson: another coverage than in JSON"
-    yield from text_report.faults(case.run.compare(case.documents, case.rules, "text").output.decode(), report)
     yield from record_faults(case.run.compare(case.documents, case.rules, "cimxml").output, report)
+
+
+def detail_says_what_json_says(case):
+    yield from detailed_report.faults(case.run.compare(case.documents, case.rules, "text").output.decode(), case.report())
+
+
+def csv_says_what_json_says(case):
+    yield from table_report.faults(case.run.compare(case.documents, case.rules, "csv").output, case.report())
+
+
+def groups_hold_the_differences(case):
+    text = case.run.grouped(case.documents, case.rules)
+    yield from grouped_report.faults(case.report(), text, case.run.grouped(case.documents, case.rules, "markdown"))
+
+
+def follows_the_schema(case):
+    """The JSON report and each line of ndjson are as the published schema says."""
+    yield from schema.faults(case.report(), case.run.compare(case.documents, case.rules, "ndjson").output)
 
 
 def record_faults(data, report):
@@ -344,6 +364,14 @@ def class_of_path(path):
     return path.split(".")[0].split(":")[-1]
 
 
+# Those that read what one run reports.
+REPORTS = [
+    formats_agree,
+    detail_says_what_json_says,
+    csv_says_what_json_says,
+    groups_hold_the_differences,
+    follows_the_schema,
+]
 ALL = [
     is_what_the_files_say,
     ends_with_the_right_status,
@@ -359,5 +387,5 @@ ALL = [
     excluding_removes_exactly_that,
     rules_may_be_written_otherwise,
     explain_says_what_is_compared,
-    formats_agree,
+    *REPORTS,
 ]

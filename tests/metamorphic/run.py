@@ -3,13 +3,14 @@
     run.py PART --program CIMDELTA --root ROOT [--seed N] [--count N] [--features LIST] [--only NAME] [--thorough] [--keep FOLDER]
     run.py compare --program CIMDELTA --root ROOT [--rules RULES] REFERENCE OTHER...
 
-PART is `random`, `rules` (random inventories with random rules), `files`, `sets` (needs --sets), or `lies` (the relations themselves, on wrong
+PART is `random`, `rules` (random inventories with random rules), `files`, `reports` (the test data of the client), `sets` (needs --sets), or `lies` (the relations themselves, on wrong
 results). `compare` checks the report on the inventories that follow. A failure prints the seed, what is wrong and the smallest documents that show
 it, and keeps them in a folder. The exit status is 0 if nothing was wrong and 1 if something was, or if the run could not be made.
 """
 
 import argparse
 import dataclasses
+import itertools
 import pathlib
 import subprocess
 import sys
@@ -17,9 +18,10 @@ import tempfile
 import traceback
 
 try:
-    import lxml.etree  # noqa: F401, first of all, for a message that says what to do
+    import jsonschema  # noqa: F401, first of all, for a message that says what to do
+    import lxml.etree  # noqa: F401
 except ImportError:
-    sys.exit("tests/metamorphic needs lxml: apt-get install python3-lxml, and run it with /usr/bin/python3")
+    sys.exit("tests/metamorphic needs lxml and jsonschema: apt-get install python3-lxml python3-jsonschema, and run it with /usr/bin/python3")
 
 import differences
 import generator
@@ -101,6 +103,14 @@ class Runner:
             documents = [(f"{number}{pathlib.Path(name).name}", (self.arguments.root / name).read_bytes()) for number, name in enumerate(names)]
             self.case(" ".join(names), documents, (self.arguments.root / rules).read_bytes() if rules else None, self.arguments.seed)
 
+    def reports(self):
+        """The formats against each other, over all pairs and some trios of the client's own test data."""
+        for names in [*itertools.permutations(CLIENT_FILES, 2), *itertools.combinations(CLIENT_FILES, 3)]:
+            documents = [(f"{name}.xml", (self.arguments.root / CLIENT / f"{name}.xml").read_bytes()) for name in names]
+            has_classes_of_rules = any(name.startswith("web") for name in names)
+            rules = (self.arguments.root / CLIENT / "rules.xml").read_bytes() if has_classes_of_rules and names[0] < names[-1] else None
+            self.case(" ".join(names), documents, rules, self.arguments.seed, relations.REPORTS)
+
     def sets(self):
         """What the engine's random tests compare, as files."""
         first, count = self.arguments.seed, self.arguments.count
@@ -111,7 +121,7 @@ class Runner:
                 documents = [(path.name, path.read_bytes()) for path in paths]
                 rules = (pathlib.Path(folder) / str(seed) / "rules.xml").read_bytes()
                 if can_be_compared(documents, rules):
-                    self.case(f"set {seed}", documents, rules, seed, [relations.is_what_the_files_say, relations.formats_agree])
+                    self.case(f"set {seed}", documents, rules, seed, [relations.is_what_the_files_say, *relations.REPORTS])
 
     def lies(self):
         """Each relation fails for a program that is wrong in its way."""
@@ -155,6 +165,9 @@ FILES = [
     (["tests/data/interchange-openpegasus/root_tstdev/inventory.xml", "tests/data/interchange-pywbem/04-all-in-one.xml"], None),
 ]
 
+CLIENT = pathlib.Path("tests/client/data")
+CLIENT_FILES = ["web01", "web01-again", "web02", "web03", "two-boots", "other-schema", "other-types", "empty-classes"]
+
 
 def can_be_compared(documents, rules_data):
     """A set may have one namespace only, rules for what none declares, or no operating system whose type cimdelta could make up."""
@@ -177,7 +190,7 @@ def kind_of(fault):
 
 def read_arguments():
     parser = argparse.ArgumentParser(description="Relations between runs of cimdelta")
-    parser.add_argument("part", choices=["random", "rules", "files", "sets", "lies", "compare"])
+    parser.add_argument("part", choices=["random", "rules", "files", "reports", "sets", "lies", "compare"])
     parser.add_argument("inventories", nargs="*", type=pathlib.Path)
     parser.add_argument("--program", required=True, type=pathlib.Path)
     parser.add_argument("--root", required=True, type=pathlib.Path)
@@ -203,6 +216,7 @@ def main():
             "random": lambda: runner.random_inventories(False),
             "rules": lambda: runner.random_inventories(True),
             "files": runner.files,
+            "reports": runner.reports,
             "lies": runner.lies,
             "sets": runner.sets,
             "compare": runner.given,
