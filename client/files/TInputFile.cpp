@@ -46,7 +46,9 @@ std::string NameOfInput(const std::string& path)
     return path == "-" ? "standard input" : path;
 }
 
-TInputFile::TInputFile(const std::string& path) : fName(NameOfInput(path)), fDescriptor(OpenFile(path)) {}
+TInputFile::TInputFile(const std::string& path, TByteCount* count)
+    : fName(NameOfInput(path)), fDescriptor(OpenFile(path)), fCount(count)
+{}
 
 TInputFile::~TInputFile()
 {
@@ -87,6 +89,9 @@ std::size_t TInputFile::ReadDescriptor(char* buffer, std::size_t size)
     for (;;) {
         const ssize_t count = read(fDescriptor, buffer, size);
         if (count >= 0) {
+            if (fCount != nullptr) {
+                fCount->fetch_add(static_cast<std::uint64_t>(count), std::memory_order_relaxed);
+            }
             return static_cast<std::size_t>(count);
         }
         const std::error_code reason = LastSystemError();

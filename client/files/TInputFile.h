@@ -4,6 +4,7 @@
 #include <vector>
 
 #include "client/files/IByteSource.h"
+#include "client/files/TByteCount.h"
 
 namespace NORVZEL20 {
 
@@ -13,9 +14,9 @@ std::string NameOfInput(const std::string& path);
 /// The bytes of a file, or of standard input, as they are.
 class TInputFile : public IByteSource {
   public:
-    /// Opens the file, or standard input for "-". Errors: TClientError if it cannot be opened, is a directory or is a standard
-    /// input that is closed.
-    explicit TInputFile(const std::string& path);
+    /// Opens the file, or standard input for "-". `count`, which may be null and otherwise must outlive this, is increased by what
+    /// is read. Errors: TClientError if it cannot be opened, is a directory or is a standard input that is closed.
+    explicit TInputFile(const std::string& path, TByteCount* count = nullptr);
     TInputFile(const TInputFile&) = delete;
     TInputFile& operator=(const TInputFile&) = delete;
     ~TInputFile() override;
@@ -34,6 +35,7 @@ class TInputFile : public IByteSource {
 
     std::string fName;
     int fDescriptor;
+    TByteCount* const fCount;
     std::string fPeeked;
     std::size_t fDelivered = 0;  // how many of the peeked bytes Read has returned
 };

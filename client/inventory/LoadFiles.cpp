@@ -58,7 +58,7 @@ TLoadReport LoadFiles(const TFilesToLoad& files, const TLoadOptions& load, const
 {
     try {
         TLoadSession session(files.ns, files.name, load);
-        TSourceReader reader(session, options.output);
+        TSourceReader reader(session, options.output, files.count);
         for (const std::string& file : files.files) {
             reader.Read(file);
         }

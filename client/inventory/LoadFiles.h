@@ -4,6 +4,7 @@
 #include <string>
 #include <vector>
 
+#include "client/files/TByteCount.h"
 #include "client/inventory/TLoadingOptions.h"
 #include "client/process/IConsole.h"
 #include "embedded/load/TLoadOptions.h"
@@ -17,6 +18,7 @@ struct TFilesToLoad {
     std::string name;  ///< what messages call them together
     std::vector<std::string> files;
     boost::shared_ptr<TInMemNamespace> ns;  ///< what they are loaded into
+    TByteCount* count = nullptr;            ///< increased by the bytes that are read; null if nobody asks
 };
 
 /// Loads the files into their namespace, all of them or nothing. Messages about what an option could remedy name it as `options`

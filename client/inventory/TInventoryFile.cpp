@@ -16,7 +16,7 @@ const std::size_t kMostToCheck = static_cast<std::size_t>(1) << 30;
 
 }  // namespace
 
-TInventoryFile::TInventoryFile(const std::string& path) : fFile(path)
+TInventoryFile::TInventoryFile(const std::string& path, TByteCount* count) : fFile(path, count)
 {
     const std::string kind = RecognizeCompression(fFile.Peek(kCompressionMark));
     if (kind == "gzip") {

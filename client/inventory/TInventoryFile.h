@@ -13,9 +13,9 @@ namespace NORVZEL20 {
 /// Threads: as IByteSource.
 class TInventoryFile : public IByteSource {
   public:
-    /// Opens the file, or standard input for "-". Errors: TClientError if it cannot be opened, is a directory or is compressed in
-    /// another way; those of Read.
-    explicit TInventoryFile(const std::string& path);
+    /// Opens the file, or standard input for "-"; `count` as for TInputFile, so of compressed bytes. Errors: TClientError if it
+    /// cannot be opened, is a directory or is compressed in another way; those of Read.
+    explicit TInventoryFile(const std::string& path, TByteCount* count = nullptr);
 
     /// Errors: also TClientError if the compressed data is damaged, ends early or is followed by something else.
     std::size_t Read(char* buffer, std::size_t size) override;

@@ -20,6 +20,7 @@
 #include "client/inventory/LoadSchema.h"
 #include "client/inventory/MakeLoadOptions.h"
 #include "client/inventory/SayNamespaceDoubts.h"
+#include "client/inventory/TLoadProgress.h"
 #include "client/process/TProgress.h"
 #include "client/process/TSignalsHeld.h"
 
@@ -34,8 +35,9 @@ const std::size_t kMostAtOnce = 16;
 // Loads inventories on the calling thread and on helper threads.
 class TParallelLoad {
   public:
-    TParallelLoad(std::vector<TInventory>& inventories, const std::vector<TLoadOptions>& options)
-        : fInventories(inventories), fOptions(options), fFaults(inventories.size()), fNext(CountAtOnce(inventories.size()))
+    TParallelLoad(std::vector<TInventory>& inventories, const std::vector<TLoadOptions>& options, TLoadProgress& progress)
+        : fInventories(inventories), fOptions(options), fProgress(progress), fFaults(inventories.size()),
+          fNext(CountAtOnce(inventories.size()))
     {}
 
     // Errors: that of the first inventory that cannot be loaded.
@@ -88,19 +90,22 @@ class TParallelLoad {
 
     void TryLoad(std::size_t i) noexcept
     {
+        fProgress.Start(i);
         try {
             TInventory& inventory = fInventories[i];
-            inventory.loaded =
-                LoadFiles({NameOfInput(inventory.path), inventory.files, inventory.ns}, fOptions[i], inventory.loading);
+            inventory.loaded = LoadFiles({NameOfInput(inventory.path), inventory.files, inventory.ns, &fProgress.BytesOf(i)},
+                                         fOptions[i], inventory.loading);
         } catch (...) {
             fFaults[i] = std::current_exception();
         }
+        fProgress.End(i);
     }
 
     std::vector<TInventory>& fInventories;
     const std::vector<TLoadOptions>& fOptions;  // of each inventory
-    std::vector<std::exception_ptr> fFaults;    // one for each inventory; null if it was loaded
-    std::atomic<std::size_t> fNext;             // the first inventory that no thread has taken
+    TLoadProgress& fProgress;
+    std::vector<std::exception_ptr> fFaults;  // one for each inventory; null if it was loaded
+    std::atomic<std::size_t> fNext;           // the first inventory that no thread has taken
 };
 
 }  // namespace
@@ -119,8 +124,9 @@ std::vector<TInventory> TInventoryLoader::Load(const std::vector<TInventorySourc
             {sources[i].argument, sources[i].files, fOptions, labels[i], TInMemNamespace::Create(kNamespaceName), {}});
     }
     {
-        const TProgress progress(fConsole, sources.size() == 1 ? "loading the inventory" : "loading the inventories");
-        TParallelLoad(inventories, options).Run();
+        TLoadProgress loaded(inventories);
+        const TProgress progress(fConsole, "loading", [&loaded] { return loaded.Describe(); });
+        TParallelLoad(inventories, options, loaded).Run();
     }
     for (std::size_t i = 0; i < inventories.size(); ++i) {
         SayTolerated(inventories[i].loaded, fConsole);

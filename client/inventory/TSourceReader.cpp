@@ -43,7 +43,7 @@ std::string FolderOfSource(const std::string& path)
 
 void TSourceReader::Read(const std::string& path)
 {
-    TInventoryFile file(path);
+    TInventoryFile file(path, fCount);
     try {
         TPeekedSource text(file, kFormMark);
         if (IsHttp(text.GetBeginning())) {

@@ -8,8 +8,8 @@
 
 namespace NORVZEL20 {
 
-TProgress::TProgress(IConsole& console, std::string doing, std::chrono::milliseconds patience)
-    : fConsole(console), fDoing(std::move(doing)), fPatience(patience)
+TProgress::TProgress(IConsole& console, std::string doing, TAmount amount, std::chrono::milliseconds patience)
+    : fConsole(console), fDoing(std::move(doing)), fAmount(std::move(amount)), fPatience(patience)
 {
     const TSignalsHeld held;
     try {
@@ -32,6 +32,12 @@ TProgress::~TProgress()
     fConsole.ShowProgress("");
 }
 
+std::string TProgress::Describe(unsigned int elapsed) const
+{
+    const std::string amount = fAmount ? fAmount() : std::string();
+    return fDoing + (amount.empty() ? "" : " " + amount) + " (" + std::to_string(elapsed) + " s)";
+}
+
 void TProgress::Wait() noexcept
 {
     std::unique_lock<std::mutex> lock(fMutex);
@@ -39,7 +45,7 @@ void TProgress::Wait() noexcept
     while (!fWake.wait_for(lock, fPatience, [this] { return fDone; })) {
         ++elapsed;
         try {
-            fConsole.ShowProgress(fDoing + " (" + std::to_string(elapsed) + " s)");
+            fConsole.ShowProgress(Describe(elapsed));
         } catch (const std::bad_alloc&) {
             // This second is skipped; in the next there may be memory again.
         }
