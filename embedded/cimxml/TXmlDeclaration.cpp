@@ -86,6 +86,9 @@ EXmlScan TXmlDeclaration::Pass(const char*& at, const char* end) noexcept
     constexpr std::string_view kBegin = "<?xml";
     constexpr std::string_view kClose = "?>";
     const std::string_view text(at, std::min<std::size_t>(static_cast<std::size_t>(end - at), kLongest));
+    if (text.size() == 1 && TXmlCharacter::IsBlank(text.front())) {
+        return EXmlScan::kRefused;  // what the first bytes say of the encoding depends on whether Expat gets this one alone
+    }
     if (text.substr(0, kBegin.size()) != kBegin.substr(0, text.size())) {
         return EXmlScan::kAccepted;  // another token
     }
