@@ -1,0 +1,214 @@
+// A PUnit is a base unit, perhaps with powers of a number behind it: "byte", "byte * 2^10", "hertz * 10^6", "bit / second * 10^3".
+// Powers of ten become the prefixes of such units, and bytes are counted.
+#include "client/text/TUnit.h"
+
+#include <algorithm>
+#include <boost/algorithm/string/case_conv.hpp>
+#include <boost/algorithm/string/classification.hpp>
+#include <boost/algorithm/string/split.hpp>
+#include <boost/algorithm/string/trim.hpp>
+#include <limits>
+#include <vector>
+
+#include "client/text/DisplayText.h"
+#include "client/text/InlineText.h"
+
+namespace NORVZEL20 {
+
+namespace {
+
+const struct {
+    const char* unit;
+    const char* shown;
+} kBaseUnits[] = {{"bit", "bit"},
+                  {"bit / second", "bit/s"},
+                  {"byte / second", "B/s"},
+                  {"hertz", "Hz"},
+                  {"second", "s"},
+                  {"ampere", "A"},
+                  {"volt", "V"},
+                  {"watt", "W"},
+                  {"joule", "J"},
+                  {"percent", "%"},
+                  {"degree celsius", "C"},
+                  {"revolution / minute", "rpm"}};
+
+const struct {
+    int exponent;
+    const char* prefix;
+} kPrefixes[] = {{-9, "n"}, {-6, "u"}, {-3, "m"}, {0, ""}, {3, "k"}, {6, "M"}, {9, "G"}, {12, "T"}};
+
+const struct {
+    const char* units;
+    const char* shown;
+} kOldUnits[] = {{"percent", "%"},     {"seconds", "s"},     {"milliseconds", "ms"},       {"microseconds", "us"},
+                 {"hertz", "Hz"},      {"megahertz", "MHz"}, {"bits per second", "bit/s"}, {"milliamps", "mA"},
+                 {"millivolts", "mV"}, {"watts", "W"}};
+
+struct TPower {
+    std::uint64_t base;
+    int exponent;
+};
+
+std::optional<std::uint64_t> NumberOf(const std::string& text)
+{
+    constexpr std::size_t kMostDigits = 18;  // of a number that surely fits
+    const bool isNumber = !text.empty() && text.size() <= kMostDigits &&
+                          std::all_of(text.begin(), text.end(), [](char c) { return c >= '0' && c <= '9'; });
+    return isNumber ? std::optional<std::uint64_t>(std::stoull(text)) : std::nullopt;
+}
+
+// "10^6", "2^-3", "1000".
+std::optional<TPower> PowerOf(const std::string& text)
+{
+    const std::size_t caret = text.find('^');
+    const std::optional<std::uint64_t> base = NumberOf(text.substr(0, caret));
+    if (!base || caret == std::string::npos) {
+        return base ? std::optional<TPower>({*base, 1}) : std::nullopt;
+    }
+    const bool isNegative = text.compare(caret + 1, 1, "-") == 0;
+    const std::optional<std::uint64_t> exponent = NumberOf(text.substr(caret + (isNegative ? 2 : 1)));
+    constexpr std::uint64_t kMostExponent = 63;
+    if (!exponent || *exponent > kMostExponent) {
+        return std::nullopt;
+    }
+    return TPower{*base, static_cast<int>(*exponent) * (isNegative ? -1 : 1)};
+}
+
+// 0 if the product is no number of 64 bits.
+std::uint64_t Multiply(const std::vector<TPower>& powers)
+{
+    std::uint64_t product = 1;
+    for (const TPower& power : powers) {
+        for (int i = 0; i < power.exponent; ++i) {
+            if (power.base == 0 || product > std::numeric_limits<std::uint64_t>::max() / power.base) {
+                return 0;
+            }
+            product *= power.base;
+        }
+        product = power.exponent < 0 ? 0 : product;
+    }
+    return product;
+}
+
+// The prefix for powers of ten; null if there is none.
+const char* PrefixOf(const std::vector<TPower>& powers)
+{
+    int exponent = 0;
+    for (const TPower& power : powers) {
+        if (power.base != 10) {
+            return nullptr;
+        }
+        exponent += power.exponent;
+    }
+    for (const auto& prefix : kPrefixes) {
+        if (prefix.exponent == exponent) {
+            return prefix.prefix;
+        }
+    }
+    return nullptr;
+}
+
+bool IsUnsigned(TCIMValue::TCIMType type)
+{
+    return type == TCIMValue::TCIMType::kUint8 || type == TCIMValue::TCIMType::kUint16 || type == TCIMValue::TCIMType::kUint32 ||
+           type == TCIMValue::TCIMType::kUint64;
+}
+
+bool IsNumber(TCIMValue::TCIMType type)
+{
+    return type >= TCIMValue::TCIMType::kUint8 && type <= TCIMValue::TCIMType::kReal64;
+}
+
+}  // namespace
+
+TUnit::TUnit(const std::string& programmatic, const std::string& units)
+{
+    if (!TakeProgrammatic(programmatic)) {
+        TakeUnits(boost::algorithm::trim_copy(units));
+    }
+}
+
+// Whether the unit is known.
+bool TUnit::TakeProgrammatic(const std::string& text)
+{
+    std::vector<std::string> parts;
+    boost::algorithm::split(parts, text, boost::algorithm::is_any_of("*"));
+    std::vector<TPower> powers;
+    for (std::size_t i = 1; i < parts.size(); ++i) {
+        const std::optional<TPower> power = PowerOf(boost::algorithm::trim_copy(parts[i]));
+        if (!power) {
+            return false;
+        }
+        powers.push_back(*power);
+    }
+    const std::string base = boost::algorithm::to_lower_copy(boost::algorithm::trim_copy(parts.front()));
+    if (base == "byte") {
+        fBytes = Multiply(powers);
+        return fBytes > 0;
+    }
+    const auto known =
+        std::find_if(std::begin(kBaseUnits), std::end(kBaseUnits), [&base](const auto& unit) { return base == unit.unit; });
+    const char* const prefix = PrefixOf(powers);
+    if (known == std::end(kBaseUnits) || prefix == nullptr) {
+        return false;
+    }
+    fName = std::string(prefix) + known->shown;
+    return true;
+}
+
+void TUnit::TakeUnits(const std::string& text)
+{
+    const std::string lower = boost::algorithm::to_lower_copy(text);
+    if (lower == "bytes") {
+        fBytes = 1;
+        return;
+    }
+    const auto known =
+        std::find_if(std::begin(kOldUnits), std::end(kOldUnits), [&lower](const auto& unit) { return lower == unit.units; });
+    if (known != std::end(kOldUnits)) {
+        fName = known->shown;
+    } else if (!text.empty()) {
+        fName = InlineText(TCIMValue(text));
+    }
+}
+
+std::string TUnit::Describe(const TCIMValue& number) const
+{
+    if (number.IsNull() || !IsNumber(number.GetType()) || (fBytes == 0 && fName.empty())) {
+        return std::string();
+    }
+    if (fBytes == 0) {
+        return DisplayValue(number) + " " + fName;
+    }
+    if (!IsUnsigned(number.GetType())) {
+        return fBytes == 1 ? DisplayValue(number) + " bytes" : std::string();
+    }
+    const bool fits = number.GetUnsigned() <= std::numeric_limits<std::uint64_t>::max() / fBytes;
+    return fits ? ReadableBytes(number.GetUnsigned() * fBytes) : std::string();
+}
+
+// In quarters of the unit, a number is exact with two digits.
+std::string ReadableBytes(std::uint64_t bytes)
+{
+    constexpr std::uint64_t kStep = 1024;
+    const char* const names[] = {"KiB", "MiB", "GiB", "TiB", "PiB", "EiB"};
+    if (bytes < kStep) {
+        return std::to_string(bytes) + (bytes == 1 ? " byte" : " bytes");
+    }
+    std::size_t name = 0;
+    std::uint64_t unit = kStep;
+    for (; bytes / unit >= kStep; unit *= kStep) {
+        ++name;
+    }
+    const std::uint64_t rest = bytes % unit;
+    const auto hundredths = static_cast<std::uint64_t>(static_cast<double>(rest) / static_cast<double>(unit) * 100 + 0.5);
+    std::string decimals = hundredths % 100 == 0 ? std::string() : "." + std::to_string(100 + hundredths % 100).substr(1);
+    if (!decimals.empty() && decimals.back() == '0') {
+        decimals.pop_back();
+    }
+    const std::string text = std::to_string(bytes / unit + hundredths / 100) + decimals + " " + names[name];
+    return rest % (unit / 4) == 0 ? text : text + " (" + std::to_string(bytes) + " bytes)";
+}
+
+}  // namespace NORVZEL20
