@@ -4,7 +4,10 @@ namespace NORVZEL20 {
 
 void AddReportOptions(CLI::App* command, TTextOptions& text)
 {
-    command->add_flag("--detail", text.isDetailed, "show each difference on its own, and all of the coverage");
+    CLI::Option* const detail =
+        command->add_flag("--detail", text.isDetailed, "show each difference on its own, and all of the coverage");
+    command->add_flag("--summary", text.isSummary, "show who differs and how much in each class, without the findings")
+        ->excludes(detail);
     command->add_flag("--coverage", text.hasWholeCoverage, "show all of what was compared and what not");
     command
         ->add_option("--limit", text.mostLines,

@@ -7,6 +7,7 @@
 #include "client/AddReferenceOptions.h"
 #include "client/AddReportOptions.h"
 #include "client/AddSystemNames.h"
+#include "client/AddTerminalOptions.h"
 #include "client/AddText.h"
 #include "client/ArgumentGuard.h"
 #include "client/commands/PrepareFiles.h"
@@ -130,6 +131,7 @@ void TCommands::AddCompare()
     AddStrictSchema(command, fCompare.strictSchema);
     AddReferenceOptions(command, fCompare);
     AddReportOptions(command, fCompare.text);
+    AddTerminalOptions(command, fCompare);
     command->add_flag("--allow-empty", fCompare.allowEmpty, "do not take it for an error if nothing was compared");
 }
 

@@ -29,6 +29,7 @@ class TKeptConsole : public IConsole {
         fSaid.append(line) += "\n";
     }
     bool IsColored() const override { return false; }
+    std::size_t GetWidth() const override { return 0; }
     void ShowProgress(std::string_view) noexcept override {}
 
     const std::string& GetResult() const { return fResult; }

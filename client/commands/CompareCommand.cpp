@@ -1,5 +1,8 @@
 #include "client/commands/CompareCommand.h"
 
+#include <algorithm>
+
+#include "client/commands/TCountingDifferences.h"
 #include "client/comparison/SeeFromMajority.h"
 #include "client/comparison/TComparison.h"
 #include "client/inventory/AlignSystemNames.h"
@@ -16,16 +19,42 @@ namespace NORVZEL20 {
 
 namespace {
 
-void Deliver(const TComparisonReport& report, const TCompareOptions& options, IConsole& console)
+constexpr std::size_t kLeastWidth = 40;
+
+// What needs no file to be found wrong.
+void CheckOptions(const TCompareOptions& options)
+{
+    if (options.text.isSummary && options.format != EOutputFormat::kText) {
+        throw TClientError("--summary is for text reports; leave it out, or -o, whose reports have a summary of their own");
+    }
+}
+
+// With the colours and the width that fit where the report goes.
+TTextOptions TextOptions(const TCompareOptions& options, const IConsole& console)
+{
+    TTextOptions text = options.text;
+    const bool isOnConsole = IsStandardOutput(options.output);
+    text.isColored =
+        options.color == EColorChoice::kAlways || (options.color == EColorChoice::kAuto && isOnConsole && console.IsColored());
+    if (const std::size_t width = isOnConsole ? console.GetWidth() : 0; width > 0) {
+        text.width = std::max(width, kLeastWidth);
+    }
+    return text;
+}
+
+void Deliver(TComparisonReport& report, const TCompareOptions& options, IConsole& console)
 {
     TResultOutput output(console, options.output);
-    {
-        const TProgress progress(console, "writing the report");
-        TTextOptions text = options.text;
-        text.isColored = console.IsColored() && IsStandardOutput(options.output);
-        WriteReport(report, options.format, text, [&output](std::string_view piece) { output.Write(piece); });
+    const bool isWritten = !options.isQuiet || !IsStandardOutput(options.output);
+    if (isWritten) {
+        const TCountingDifferences counting(report);
+        const TProgress progress(console, "writing the report", [&counting] { return counting.Describe(); });
+        WriteReport(report, options.format, TextOptions(options, console),
+                    [&output](std::string_view piece) { output.Write(piece); });
     }
-    output.Deliver();
+    if (isWritten) {
+        output.Deliver();
+    }
 }
 
 }  // namespace
@@ -33,6 +62,7 @@ void Deliver(const TComparisonReport& report, const TCompareOptions& options, IC
 int RunCompare(const TCompareOptions& options, IConsole& console)
 {
     // Before the inventories, which may take long to load.
+    CheckOptions(options);
     CheckSystemNames(options.systems);
     const std::vector<TInventorySources> sources = options.reference.Apply(options.inventories, options.format);
     const std::optional<TRulesText> rules = ReadRulesIfAny(options.rules);

@@ -3,6 +3,7 @@
 #include <string>
 #include <vector>
 
+#include "client/commands/EColorChoice.h"
 #include "client/commands/TReferenceChoice.h"
 #include "client/inventory/TInventorySources.h"
 #include "client/inventory/TLoadingOptions.h"
@@ -19,8 +20,10 @@ struct TCompareOptions {
     TReferenceChoice reference;
     std::string rules;  ///< empty: everything is compared
     EOutputFormat format = EOutputFormat::kText;
-    TTextOptions text;   ///< whether it is coloured is found out by the command
-    std::string output;  ///< empty: standard output
+    TTextOptions text;  ///< colour and width are found out by the command
+    EColorChoice color = EColorChoice::kAuto;
+    bool isQuiet = false;  ///< whether nothing is written to standard output
+    std::string output;    ///< empty: standard output
     bool strictSchema = false;
     bool allowEmpty = false;  ///< whether it is no error if nothing was compared
     TLoadingOptions loading;

@@ -1,5 +1,6 @@
 #pragma once
 
+#include <cstddef>
 #include <string_view>
 
 namespace NORVZEL20 {
@@ -19,8 +20,12 @@ class IConsole {
     /// then "?" stands for everything that is not printable ASCII.
     virtual void Say(std::string_view line) noexcept = 0;
 
-    /// Whether a result on standard output is to be coloured: it is a terminal, and NO_COLOR is not set.
+    /// Whether a result on standard output is to be coloured: it is a terminal or CLICOLOR_FORCE is set and not 0, and NO_COLOR is
+    /// not set.
     virtual bool IsColored() const = 0;
+
+    /// How many columns a result on standard output has: those of the terminal, otherwise COLUMNS; 0 if neither says so.
+    virtual std::size_t GetWidth() const = 0;
 
     /// Replaces the line of progress on standard error, if that is a terminal. An empty text removes the line.
     virtual void ShowProgress(std::string_view text) noexcept = 0;

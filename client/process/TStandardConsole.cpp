@@ -1,7 +1,9 @@
 #include "client/process/TStandardConsole.h"
 
+#include <sys/ioctl.h>
 #include <unistd.h>
 
+#include <charconv>
 #include <cstdlib>
 #include <cstring>
 
@@ -31,6 +33,21 @@ bool IsSet(const char* variable)
     return value != nullptr && *value != '\0';
 }
 
+bool IsForced(const char* variable)
+{
+    return IsSet(variable) && std::strcmp(std::getenv(variable), "0") != 0;
+}
+
+// The number that the variable has; 0 if it has none.
+std::size_t NumberIn(const char* variable)
+{
+    const char* const value = IsSet(variable) ? std::getenv(variable) : "";
+    std::size_t number = 0;
+    const char* const end = value + std::strlen(value);
+    const std::from_chars_result read = std::from_chars(value, end, number);
+    return read.ec == std::errc() && read.ptr == end ? number : 0;
+}
+
 // Writes a line without allocating. Escaping would need memory, so ? stands for everything that is not printable ASCII.
 void SayPlainly(std::string_view line) noexcept
 {
@@ -44,7 +61,8 @@ void SayPlainly(std::string_view line) noexcept
 }  // namespace
 
 TStandardConsole::TStandardConsole()
-    : fColored(IsTerminal(STDOUT_FILENO) && !IsSet("NO_COLOR")), fProgress(IsTerminal(STDERR_FILENO))
+    : fColored((IsTerminal(STDOUT_FILENO) || IsForced("CLICOLOR_FORCE")) && !IsSet("NO_COLOR")),
+      fProgress(IsTerminal(STDERR_FILENO))
 {}
 
 void TStandardConsole::WriteResult(std::string_view piece)
@@ -57,6 +75,15 @@ void TStandardConsole::WriteResult(std::string_view piece)
     if (error) {
         throw TClientError("standard output cannot be written", error);
     }
+}
+
+std::size_t TStandardConsole::GetWidth() const
+{
+    winsize size{};
+    if (isatty(STDOUT_FILENO) != 0 && ioctl(STDOUT_FILENO, TIOCGWINSZ, &size) == 0 && size.ws_col > 0) {
+        return size.ws_col;
+    }
+    return NumberIn("COLUMNS");
 }
 
 void TStandardConsole::Say(std::string_view line) noexcept

@@ -14,6 +14,7 @@ class TStandardConsole : public IConsole {
     void WriteResult(std::string_view piece) override;
     void Say(std::string_view line) noexcept override;
     bool IsColored() const override { return fColored; }
+    std::size_t GetWidth() const override;
     void ShowProgress(std::string_view text) noexcept override;
 
   private:

@@ -63,7 +63,7 @@ std::string TGroupedText::Write() const
         text += WhoDiffers();
     }
     if (!fFindings.classes.empty()) {
-        text += "\n" + Findings();
+        text += "\n" + (fOptions.isSummary ? ClassCounts() : Findings());
     }
     return text + "\n" + (fOptions.hasWholeCoverage ? WriteTextCoverage(fReport) : WriteShortCoverage(fReport));
 }
@@ -144,6 +144,21 @@ std::string TGroupedText::Findings() const
         }
     }
     return boost::algorithm::join(lines, "\n") + "\n";
+}
+
+// Each class with its counts.
+std::string TGroupedText::ClassCounts() const
+{
+    std::size_t width = 0;
+    for (const TClassFindings& findings : fFindings.classes) {
+        width = std::max(width, EscapeForDisplay(findings.className).size());
+    }
+    std::string text;
+    for (const TClassFindings& findings : fFindings.classes) {
+        const std::string name = EscapeForDisplay(findings.className);
+        text += Bold(name) + std::string(width - name.size() + 2, ' ') + ClassLines(findings, 1).Counts() + "\n";
+    }
+    return text;
 }
 
 std::vector<std::string> TGroupedText::Lines(std::size_t most) const

@@ -30,6 +30,7 @@ class TGroupedText {
     std::string Counts() const;
     std::string WhoDiffers() const;
     std::string Findings() const;
+    std::string ClassCounts() const;
     std::vector<std::string> Lines(std::size_t most) const;
     std::vector<std::string> Heads() const;
     TClassLines ClassLines(const TClassFindings& findings, std::size_t most) const;

@@ -8,6 +8,7 @@ namespace NORVZEL20 {
 struct TTextOptions {
     bool isColored = false;         ///< with escape sequences for a terminal
     bool isDetailed = false;        ///< every difference on its own, with the whole coverage
+    bool isSummary = false;         ///< who differs and how much, without the findings
     bool hasWholeCoverage = false;  ///< the whole coverage, not only its summary
     std::size_t width = 120;        ///< columns at which contents are cut; 0 for no limit
     std::size_t mostLines = 0;      ///< how long the findings may be if groups are shortened; 0 for no limit

@@ -34,6 +34,7 @@ class TClientFixture : public ::testing::Test {
         }
         TFakeConsole console;
         console.fColored = fColored;
+        console.fWidth = fWidth;
         fStatus = RunClient(static_cast<int>(argv.size()), argv.data(), console);
         fOut = console.fOut;
         fErr = console.fErr;
@@ -85,6 +86,7 @@ class TClientFixture : public ::testing::Test {
     std::string fOut;
     std::string fErr;
     bool fColored = false;
+    std::size_t fWidth = 0;
     std::vector<std::string> fScratch;
 };
 

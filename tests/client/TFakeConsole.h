@@ -17,6 +17,7 @@ class TFakeConsole : public IConsole {
         fErr.append(line) += "\n";
     }
     bool IsColored() const override { return fColored; }
+    std::size_t GetWidth() const override { return fWidth; }
     void ShowProgress(std::string_view text) noexcept override
     {
         const std::lock_guard<std::mutex> lock(fMutex);
@@ -27,6 +28,7 @@ class TFakeConsole : public IConsole {
     std::string fErr;
     std::string fProgress;
     bool fColored = false;
+    std::size_t fWidth = 0;
 
   private:
     std::mutex fMutex;

@@ -33,6 +33,7 @@ class TFixedConsole : public IConsole {
         Append(fErr, fErrLength, "\n");
     }
     bool IsColored() const override { return false; }
+    std::size_t GetWidth() const override { return 0; }
     void ShowProgress(std::string_view) noexcept override {}
 
     std::string GetOut() const { return std::string(fOut, fOutLength); }
