@@ -3,6 +3,7 @@
 #include <algorithm>
 #include <memory>
 
+#include "client/AddBaseline.h"
 #include "client/AddLoadingOptions.h"
 #include "client/AddReferenceOptions.h"
 #include "client/AddReportOptions.h"
@@ -116,7 +117,9 @@ void TCommands::AddCompare()
         AddCommand("compare", "show what differs between a reference and other inventories", [this](IConsole& console) {
             std::vector<std::string> inventories = fOthers;
             inventories.insert(inventories.begin(), fReference);
-            fCompare.inventories = PrepareFiles({inventories, fCompare.rules, fCompare.output}, fCompare.loading, 2, console);
+            const TCommandFiles files{inventories, fCompare.rules, fCompare.output, fCompare.baseline.baseline,
+                                      fCompare.baseline.accept};
+            fCompare.inventories = PrepareFiles(files, fCompare.loading, 2, console);
             return RunCompare(fCompare, console);
         });
     AddText(command, "REFERENCE", fReference, kInventoryHelp)->required()->option_text(" ");
@@ -131,6 +134,7 @@ void TCommands::AddCompare()
     AddStrictSchema(command, fCompare.strictSchema);
     AddReferenceOptions(command, fCompare);
     AddReportOptions(command, fCompare.text);
+    AddBaseline(command, fCompare.baseline);
     AddTerminalOptions(command, fCompare);
     command->add_flag("--allow-empty", fCompare.allowEmpty, "do not take it for an error if nothing was compared");
 }

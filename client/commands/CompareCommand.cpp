@@ -1,7 +1,9 @@
 #include "client/commands/CompareCommand.h"
 
 #include <algorithm>
+#include <utility>
 
+#include "client/baseline/ReadBaseline.h"
 #include "client/commands/TCountingDifferences.h"
 #include "client/comparison/SeeFromMajority.h"
 #include "client/comparison/TComparison.h"
@@ -21,12 +23,29 @@ namespace {
 
 constexpr std::size_t kLeastWidth = 40;
 
+bool IsBesideBaseline(const TBaselineOptions& options)
+{
+    return !options.accept.empty() || !options.baseline.empty();
+}
+
 // What needs no file to be found wrong.
 void CheckOptions(const TCompareOptions& options)
 {
+    if (options.format == EOutputFormat::kCimXml && IsBesideBaseline(options.baseline)) {
+        throw TClientError("-o cimxml writes the records of all differences, so it cannot be combined with --accept or --baseline; "
+                           "choose another format");
+    }
     if (options.text.isSummary && options.format != EOutputFormat::kText) {
         throw TClientError("--summary is for text reports; leave it out, or -o, whose reports have a summary of their own");
     }
+}
+
+std::optional<TBaseline> ReadBaselineIfNamed(const TBaselineOptions& options)
+{
+    if (!options.baseline.empty()) {
+        return ReadBaseline(options.baseline);
+    }
+    return options.accept.empty() ? std::nullopt : std::make_optional(ReadBaselineIfAny(options.accept));
 }
 
 // With the colours and the width that fit where the report goes.
@@ -42,7 +61,8 @@ TTextOptions TextOptions(const TCompareOptions& options, const IConsole& console
     return text;
 }
 
-void Deliver(TComparisonReport& report, const TCompareOptions& options, IConsole& console)
+// What is accepted is kept before the report is seen: if that fails, there is no report.
+void Deliver(TComparisonReport& report, const TCompareOptions& options, const TBaseline* accepted, IConsole& console)
 {
     TResultOutput output(console, options.output);
     const bool isWritten = !options.isQuiet || !IsStandardOutput(options.output);
@@ -51,6 +71,9 @@ void Deliver(TComparisonReport& report, const TCompareOptions& options, IConsole
         const TProgress progress(console, "writing the report", [&counting] { return counting.Describe(); });
         WriteReport(report, options.format, TextOptions(options, console),
                     [&output](std::string_view piece) { output.Write(piece); });
+    }
+    if (accepted != nullptr) {
+        DeliverResult(console, options.baseline.accept, accepted->ToText());
     }
     if (isWritten) {
         output.Deliver();
@@ -66,6 +89,7 @@ int RunCompare(const TCompareOptions& options, IConsole& console)
     CheckSystemNames(options.systems);
     const std::vector<TInventorySources> sources = options.reference.Apply(options.inventories, options.format);
     const std::optional<TRulesText> rules = ReadRulesIfAny(options.rules);
+    std::optional<TBaseline> baseline = ReadBaselineIfNamed(options.baseline);
     std::vector<TInventory> inventories = TInventoryLoader(console, options.loading).Load(sources);
     AlignSystemNames(inventories, options.systems);
     TComparisonReport report = TComparison(inventories, console).Run(rules, options.strictSchema);
@@ -75,8 +99,12 @@ int RunCompare(const TCompareOptions& options, IConsole& console)
     if (options.reference.WantsMajority()) {
         report = SeeFromMajority(report);
     }
-    Deliver(report, options, console);
-    return report.differences->GetCounts().GetTotal() == 0 ? kExitSuccess : kExitDifferences;
+    if (baseline) {
+        baseline = ApplyBaseline(report, std::move(*baseline), options.baseline);
+    }
+    const bool isAccepting = !options.baseline.accept.empty();
+    Deliver(report, options, isAccepting ? &*baseline : nullptr, console);
+    return isAccepting || report.differences->GetCounts().GetTotal() == 0 ? kExitSuccess : kExitDifferences;
 }
 
 }  // namespace NORVZEL20

@@ -3,6 +3,7 @@
 #include <string>
 #include <vector>
 
+#include "client/baseline/ApplyBaseline.h"
 #include "client/commands/EColorChoice.h"
 #include "client/commands/TReferenceChoice.h"
 #include "client/inventory/TInventorySources.h"
@@ -23,15 +24,17 @@ struct TCompareOptions {
     TTextOptions text;  ///< colour and width are found out by the command
     EColorChoice color = EColorChoice::kAuto;
     bool isQuiet = false;  ///< whether nothing is written to standard output
-    std::string output;    ///< empty: standard output
+    TBaselineOptions baseline;
+    std::string output;  ///< empty: standard output
     bool strictSchema = false;
     bool allowEmpty = false;  ///< whether it is no error if nothing was compared
     TLoadingOptions loading;
     TSystemNames systems;
 };
 
-/// Compares inventories. Returns kExitSuccess (0) for no differences, otherwise kExitDifferences (1). Errors: TClientError, also if
-/// nothing was compared, unless that is allowed; no result has been written then.
+/// Compares inventories. Returns kExitSuccess (0) for no differences, or for none that are not accepted, otherwise kExitDifferences
+/// (1). Errors: TClientError, also if nothing was compared, unless that is allowed; no result has been written then, and the file
+/// of accepted differences is as it was.
 int RunCompare(const TCompareOptions& options, IConsole& console);
 
 }  // namespace NORVZEL20

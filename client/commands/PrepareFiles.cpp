@@ -1,12 +1,41 @@
 #include "client/commands/PrepareFiles.h"
 
+#include "client/files/TInputFile.h"
 #include "client/inventory/CheckInventoryFiles.h"
 #include "client/inventory/DropRepeatedFiles.h"
 #include "client/inventory/LoadSchema.h"
 #include "client/inventory/ReadInventoryArgument.h"
+#include "client/process/TClientError.h"
 #include "client/report/TResultOutput.h"
 
 namespace NORVZEL20 {
+
+namespace {
+
+// Checks the files of accepted differences and adds them to the inputs.
+void CheckBaselineFiles(const TCommandFiles& files, std::vector<std::string>& inputs)
+{
+    for (const std::string* const path : {&files.baseline, &files.accept}) {
+        if (*path == "-") {
+            throw TClientError("found - for accepted differences, expected a file; name one");
+        }
+    }
+    if (!files.baseline.empty()) {
+        const TInputFile readable(files.baseline);
+        inputs.push_back(files.baseline);
+    }
+    if (files.accept.empty()) {
+        return;
+    }
+    CheckOutput(files.accept, inputs);
+    if (files.accept == files.output) {
+        throw TClientError(files.accept + ": found for both the result and the accepted differences, expected two files; "
+                                          "name another one for the result");
+    }
+    inputs.push_back(files.accept);
+}
+
+}  // namespace
 
 std::vector<TInventorySources> PrepareFiles(const TCommandFiles& files, TLoadingOptions& loading, std::size_t fewest,
                                             IConsole& console)
@@ -23,6 +52,7 @@ std::vector<TInventorySources> PrepareFiles(const TCommandFiles& files, TLoading
     if (!files.rules.empty()) {
         inputs.push_back(files.rules);
     }
+    CheckBaselineFiles(files, inputs);
     CheckOutput(files.output, inputs);
     loading.output = IsStandardOutput(files.output) ? std::string() : files.output;
     CheckInventoryFiles(toLoad);

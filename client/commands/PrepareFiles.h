@@ -14,6 +14,8 @@ struct TCommandFiles {
     std::vector<std::string> inventories;  ///< arguments, see ReadInventoryArgument
     std::string rules;                     ///< empty: none
     std::string output;                    ///< empty: standard output
+    std::string baseline = std::string();  ///< is read; empty: none
+    std::string accept = std::string();    ///< likewise, if it is there, and replaced; empty: none
 };
 
 /// Checks the files before a command reads the first of them, so that nobody waits for large inventories to learn of a misspelt

@@ -2,10 +2,12 @@
 
 #include <boost/smart_ptr/shared_ptr.hpp>
 #include <memory>
+#include <optional>
 #include <string>
 #include <vector>
 
 #include "client/comparison/IDifferences.h"
+#include "client/comparison/TBaselineOutcome.h"
 #include "client/comparison/TCoverage.h"
 #include "embedded/load/TLoadReport.h"
 #include "provider/TDeltaNamespace.h"
@@ -25,6 +27,7 @@ struct TComparisonReport {
     const std::vector<TInventory>* inventories;  ///< those that were compared; they must outlive this
     boost::shared_ptr<TDeltaNamespace> records;  ///< the delta namespace of the run
     std::shared_ptr<IDifferences> differences;   ///< what the records stand for; reads the inventories
+    std::optional<TBaselineOutcome> baseline;    ///< if `differences` are what a baseline does not accept
     /// If the reference is what most inventories have (see SeeFromMajority): the report of the run, which says what was compared,
     /// and `inventories`. Otherwise null.
     std::shared_ptr<const TComparisonReport> run = nullptr;

@@ -1,6 +1,8 @@
 #include "client/report/DescribeAgreement.h"
 
 #include "client/report/DisplayLabels.h"
+#include "client/text/Counted.h"
+#include "client/text/DisplayText.h"
 
 namespace NORVZEL20 {
 
@@ -9,6 +11,11 @@ std::string DescribeAgreement(const TComparisonReport& report)
     const std::string between = " between " + DisplayLabels(report, {0}) + " and " + DisplayOthers(report);
     if (report.coverage.IsNothingCompared()) {
         return "Nothing was compared" + between + ".";
+    }
+    if (report.baseline && report.baseline->accepted > 0) {
+        return "Nothing new" + between + " since " + EscapeForDisplay(report.baseline->file) + ": " +
+               Counted(report.baseline->accepted, "accepted difference") +
+               (report.coverage.IsCompleteButForTimes() ? "." : "; not everything was compared, see below.");
     }
     if (report.coverage.IsCompleteButForTimes()) {
         return "No differences" + between + (report.coverage.IsComplete() ? "." : ", times of collection aside.");

@@ -28,10 +28,11 @@
 // that was replaced, or with "declared": "Bag" and "declaredAsIn": "Ordered"; its kind decides, also whether it has "property".
 //
 // JsonGroups.cpp shows the groups, JsonDifference.cpp the differences. Lists of numbers have one for each inventory, the reference
-// first.
+// first. With a baseline, "baseline" stands in front of "coverage", as JsonBaseline.cpp shows it.
 #include "client/report/JsonFormat.h"
 
 #include "client/findings/CollectFindings.h"
+#include "client/report/JsonBaseline.h"
 #include "client/report/JsonCoverage.h"
 #include "client/report/JsonDifference.h"
 #include "client/report/JsonGroups.h"
@@ -122,6 +123,9 @@ void WriteJsonReport(const TComparisonReport& report, const TTextSink& sink)
     document.StartList("differences");
     report.differences->ForEach([&](const TDifference& difference) { document.AddElement(JsonOfDifference(report, difference)); });
     document.EndList();
+    if (report.baseline) {
+        document.Add("baseline", JsonOfBaseline(*report.baseline));
+    }
     document.Add("coverage", JsonOfCoverage(report));
     document.End();
 }
@@ -133,6 +137,9 @@ void WriteNdjsonReport(const TComparisonReport& report, const TTextSink& sink)
     TJsonDocument line(sink, false);
     line.Add("kind", "coverage");
     AddFindings(line, report);
+    if (report.baseline) {
+        line.Add("baseline", JsonOfBaseline(*report.baseline));
+    }
     const TJson coverage = JsonOfCoverage(report);
     for (const auto& [name, value] : coverage.items()) {
         line.Add(name, value);

@@ -24,6 +24,7 @@
 #include <boost/algorithm/string/join.hpp>
 #include <map>
 
+#include "client/report/BaselineText.h"
 #include "client/report/DescribeAgreement.h"
 #include "client/report/DisplayLabels.h"
 #include "client/report/ShortCoverage.h"
@@ -65,6 +66,7 @@ std::string TGroupedText::Write() const
     if (!fFindings.classes.empty()) {
         text += "\n" + (fOptions.isSummary ? ClassCounts() : Findings());
     }
+    text += WriteBaselineText(fReport, fOptions);
     return text + "\n" + (fOptions.hasWholeCoverage ? WriteTextCoverage(fReport) : WriteShortCoverage(fReport));
 }
 

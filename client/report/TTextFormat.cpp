@@ -16,6 +16,7 @@
 
 #include <boost/algorithm/string/join.hpp>
 
+#include "client/report/BaselineText.h"
 #include "client/report/DescribeAgreement.h"
 #include "client/report/DisplayLabels.h"
 #include "client/report/TDifferenceText.h"
@@ -28,8 +29,9 @@ namespace NORVZEL20 {
 
 void TTextFormat::Write(const TTextSink& sink) const
 {
-    sink(Paint(fColored, kBold, Summary()) + "\n");
+    sink(Paint(fOptions.isColored, kBold, Summary()) + "\n");
     WriteDifferences(sink);
+    sink(WriteBaselineText(fReport, fOptions));
     sink("\n" + WriteTextCoverage(fReport));
 }
 
@@ -71,7 +73,7 @@ void TTextFormat::WriteDifferences(const TTextSink& sink) const
         if (className != difference.className) {
             className = difference.className;
             changed.clear();
-            sink("\n" + Paint(fColored, kBold, EscapeForDisplay(className)) + "\n");
+            sink("\n" + Paint(fOptions.isColored, kBold, EscapeForDisplay(className)) + "\n");
         }
         const bool isChanged = difference.kind == TDifference::kChanged;
         sink(Describe(difference, isChanged && changed == difference.instance));
@@ -88,11 +90,11 @@ std::string TTextFormat::Describe(const TDifference& difference, bool sameInstan
     }
     switch (difference.kind) {
     case TDifference::kOnlyInReference:
-        return Paint(fColored, kRed, "- " + text.Instance()) + "\n" + text.Values();
+        return Paint(fOptions.isColored, kRed, "- " + text.Instance()) + "\n" + text.Values();
     case TDifference::kOnlyInOthers:
-        return Paint(fColored, kGreen, "+ " + text.Instance()) + "\n" + text.Values();
+        return Paint(fOptions.isColored, kGreen, "+ " + text.Instance()) + "\n" + text.Values();
     default:
-        return Paint(fColored, kYellow, "~ " + text.Instance()) + "\n" + text.Values();
+        return Paint(fOptions.isColored, kYellow, "~ " + text.Instance()) + "\n" + text.Values();
     }
 }
 

@@ -4,6 +4,7 @@
 #include <vector>
 
 #include "client/comparison/TComparisonReport.h"
+#include "client/report/TTextOptions.h"
 #include "client/report/TTextSink.h"
 
 namespace NORVZEL20 {
@@ -12,8 +13,8 @@ namespace NORVZEL20 {
 /// compared and what not.
 class TTextFormat {
   public:
-    /// `report` must outlive this. `colored` adds escape sequences for a terminal.
-    TTextFormat(const TComparisonReport& report, bool colored) : fReport(report), fColored(colored) {}
+    /// The arguments must outlive this. Of the options only colour matters.
+    TTextFormat(const TComparisonReport& report, const TTextOptions& options) : fReport(report), fOptions(options) {}
 
     /// Writes the whole text. Names and values in it are escaped as by EscapeForDisplay. Errors: those of IDifferences::ForEach;
     /// what the sink throws.
@@ -28,7 +29,7 @@ class TTextFormat {
     bool IsPair() const { return fReport.labels.size() == 2; }
 
     const TComparisonReport& fReport;
-    const bool fColored;
+    const TTextOptions& fOptions;
 };
 
 }  // namespace NORVZEL20

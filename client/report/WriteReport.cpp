@@ -16,7 +16,7 @@ namespace {
 void WriteText(const TComparisonReport& report, const TTextOptions& options, const TTextSink& sink)
 {
     if (options.isDetailed) {
-        return TTextFormat(report, options.isColored).Write(sink);
+        return TTextFormat(report, options).Write(sink);
     }
     const TFindings findings = CollectFindings(report);
     sink(TGroupedText(report, findings, options).Write());

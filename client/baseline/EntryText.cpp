@@ -1,0 +1,65 @@
+#include "client/baseline/EntryText.h"
+
+#include "client/baseline/ForEachUnquoted.h"
+
+namespace NORVZEL20 {
+
+namespace {
+
+// Whether the text is one field, and no mark.
+bool IsField(const std::string& text)
+{
+    bool isWhole = !text.empty() && text.front() != '"' && text.front() != '\'' && text.back() != ',' && text != "in";
+    const std::size_t open = ForEachUnquoted(
+        text, [&](std::size_t at) { return isWhole = isWhole && text[at] != ' ' && text[at] != '\t' && text[at] != '#'; });
+    return isWhole && open == std::string_view::npos;
+}
+
+std::string Quoted(const std::string& text)
+{
+    std::string quoted = "\"";
+    for (const char character : text) {
+        quoted.append(character == '"' || character == '\\' ? "\\" : "") += character;
+    }
+    return quoted + '"';
+}
+
+}  // namespace
+
+std::string FieldText(const std::string& text)
+{
+    return IsField(text) ? text : Quoted(text);
+}
+
+const char* SignOf(TDifference::EKind kind)
+{
+    switch (kind) {
+    case TDifference::kOnlyInReference:
+        return "-";
+    case TDifference::kOnlyInOthers:
+        return "+";
+    default:
+        return "~";
+    }
+}
+
+std::string EntryValueText(const TAcceptedDifference::TValue& value)
+{
+    return value.property + ": " + (value.before.empty() ? "" : value.before + " -> ") + value.after;
+}
+
+std::string EntryText(const TAcceptedDifference& entry)
+{
+    std::string text = std::string(SignOf(entry.kind)) + " " + entry.instance;
+    for (std::size_t i = 0; i < entry.values.size(); ++i) {
+        text += (i == 0 ? " " : ", ") + EntryValueText(entry.values[i]);
+    }
+    text += " in ";
+    for (std::size_t i = 0; i < entry.inventories.size(); ++i) {
+        const std::string& label = entry.inventories[i];
+        text += (i == 0 ? "" : ", ") + (label.find(',') == std::string::npos ? FieldText(label) : Quoted(label));
+    }
+    return text;
+}
+
+}  // namespace NORVZEL20

@@ -1,0 +1,48 @@
+#pragma once
+
+#include <memory>
+#include <optional>
+#include <string>
+#include <vector>
+
+#include "client/baseline/TBaseline.h"
+#include "client/baseline/TDifferenceStates.h"
+#include "client/comparison/TComparisonReport.h"
+
+namespace NORVZEL20 {
+
+/// What a baseline means for the inventories of a run.
+class TAcceptance {
+  public:
+    enum EVerdict {
+        kAccepted,
+        kNew,       ///< nothing is known of it for that inventory
+        kDifferent  ///< the inventory was accepted with another value, or for another value of the reference
+    };
+
+    /// The report must outlive this.
+    TAcceptance(std::shared_ptr<const TBaseline> baseline, const TComparisonReport& report)
+        : fBaseline(std::move(baseline)), fReport(report)
+    {}
+
+    const TBaseline& GetBaseline() const { return *fBaseline; }
+    const std::string& LabelOf(std::size_t inventory) const { return fReport.labels[inventory]; }
+
+    /// The entry for one of the inventories of a difference, whatever its values.
+    std::optional<std::size_t> FindEntry(const TDifference& difference, const TDifferenceStates& states,
+                                         std::size_t inventory) const;
+    /// Whether the difference is accepted for one of its inventories. Contents that this run does not compare do not count.
+    EVerdict Judge(const TDifference& difference, const TDifferenceStates& states, std::size_t inventory) const;
+    /// Whether the run compared what the entry is about: if so and there is no such difference, it is gone.
+    bool IsCompared(const TAcceptedDifference& entry) const;
+    /// Whether one of the other inventories has that label.
+    bool IsOther(const std::string& label) const;
+
+  private:
+    const TCoverage::TClass* FindClass(const std::string& name) const;
+
+    const std::shared_ptr<const TBaseline> fBaseline;
+    const TComparisonReport& fReport;
+};
+
+}  // namespace NORVZEL20

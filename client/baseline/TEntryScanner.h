@@ -1,0 +1,39 @@
+#pragma once
+
+#include <cstddef>
+#include <string>
+#include <string_view>
+
+namespace NORVZEL20 {
+
+/// Takes a line of a baseline apart into fields. Blanks and tabs separate fields, except within quotes, where a backslash takes the
+/// next character as it is.
+class TEntryScanner {
+  public:
+    /// `file` and `line` are for messages. `text` must outlive this.
+    TEntryScanner(std::string_view text, std::string file, std::size_t line);
+
+    /// The field that comes next; empty at the end of the line and in front of the `#` of a reason.
+    const std::string& Peek() const { return fField; }
+    /// Takes it. Errors: TClientError for quotes that are not closed, also when the scanner is made.
+    std::string Take();
+    /// What stands behind the `#`, trimmed, once all fields are taken.
+    std::string GetReason() const;
+
+    /// Throws a TClientError that names the file, the line, the column of the next field and what it is. `expected` goes on with
+    /// what can be done.
+    [[noreturn]] void Refuse(const std::string& expected) const;
+
+  private:
+    void Advance();
+    [[noreturn]] void RefuseAt(std::size_t position, const std::string& what) const;
+
+    const std::string_view fText;
+    const std::string fFile;
+    const std::size_t fLine;
+    std::size_t fBegin = 0;  // of the next field
+    std::size_t fEnd = 0;
+    std::string fField;
+};
+
+}  // namespace NORVZEL20

@@ -1,0 +1,31 @@
+#pragma once
+
+#include <cstddef>
+#include <string>
+#include <vector>
+
+#include "client/comparison/TAcceptedDifference.h"
+
+namespace NORVZEL20 {
+
+/// What a baseline says of the differences of a run. The differences of the report are then those that it does not accept.
+struct TBaselineOutcome {
+    /// An accepted difference that is another one now.
+    struct TChanged {
+        TAcceptedDifference accepted;
+        TAcceptedDifference present;  ///< the same inventories; of kOnlyInOthers all values
+    };
+
+    std::string file;
+    bool isAccepting = false;               ///< whether the file takes over what the report shows
+    std::size_t accepted = 0;               ///< differences that the baseline accepts in all their inventories
+    std::size_t appeared = 0;               ///< differences of the report that are in the baseline for none of their inventories
+    std::size_t different = 0;              ///< the others of the report: some inventory was accepted with another value
+    std::vector<TChanged> changed;          ///< for each of those, what was accepted
+    std::vector<TAcceptedDifference> gone;  ///< accepted, and no longer there; only for inventories that were compared
+    std::vector<TAcceptedDifference> notCompared;  ///< those whose class or property was not compared in this run
+    std::vector<std::string> absent;               ///< labels in the baseline that no other inventory of the run has, ascending
+    std::size_t ofAbsent = 0;                      ///< how many entries are for them
+};
+
+}  // namespace NORVZEL20

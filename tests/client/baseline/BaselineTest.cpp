@@ -1,0 +1,322 @@
+// Differences that were accepted, and what later runs report beside them. Systems have disks; their sizes are what changes.
+
+#include <gtest/gtest.h>
+
+#include <map>
+#include <string>
+#include <vector>
+
+#include "tests/client/Documents.h"
+#include "tests/client/TClientFixture.h"
+
+namespace NORVZEL20 {
+namespace {
+
+using TDisks = std::map<std::string, std::string>;
+
+const std::string kMark = "cimdelta-baseline 1\n# Accepted differences, one a line. What stands behind # is the reason.\n\n";
+
+class BaselineTest : public TClientFixture {
+  protected:
+    void SetUp() override
+    {
+        TClientFixture::SetUp();
+        fBaseline = Scratch("base.txt", "");
+        unlink(fBaseline.c_str());
+        System("web01", {{"sda", "1"}, {"sdb", "5"}});
+    }
+
+    /// The disks of a system and their sizes, from now on.
+    void System(const std::string& label, const TDisks& disks)
+    {
+        std::string contents = NORVZEL20::System() +
+                               Class("Disk", "", KeyProperty("Id") + Declaration("Size", "uint16") + Declaration("Note", "string"));
+        for (const auto& [id, size] : disks) {
+            contents += Instance("Disk", Value("Id", id) + Value("Size", size, "uint16"));
+        }
+        fSystems[label] = Scratch(label + ".xml", Document(contents));
+    }
+
+    std::string Compare(std::vector<std::string> options)
+    {
+        options.insert(options.begin(), "compare");
+        for (const auto& [label, path] : fSystems) {
+            options.push_back(label);
+            options.back() += "=" + path;
+        }
+        Run(options);
+        return Shorten(fStatus == 2 ? fErr : fOut, fBaseline, "base.txt");
+    }
+
+    void Accept(const std::vector<std::string>& options = {})
+    {
+        std::vector<std::string> all{"--accept", fBaseline};
+        all.insert(all.end(), options.begin(), options.end());
+        fReport = Compare(all);
+        EXPECT_EQ("", fErr);
+        EXPECT_EQ(0, fStatus);
+    }
+
+    /// The report without the lines on what was compared.
+    std::string Since(const std::vector<std::string>& options = {})
+    {
+        std::vector<std::string> all{"--baseline", fBaseline};
+        all.insert(all.end(), options.begin(), options.end());
+        fReport = Compare(all);
+        EXPECT_EQ("", fErr);
+        return fReport.substr(0, fReport.rfind("\n\n") + 1);
+    }
+
+    /// The entries of the file.
+    std::string Entries() const
+    {
+        const std::string text = ReadFile(fBaseline);
+        EXPECT_EQ(kMark, text.substr(0, kMark.size()));
+        return text.substr(kMark.size());
+    }
+
+    void WriteEntries(const std::string& entries) const { std::ofstream(fBaseline) << kMark << entries; }
+
+    std::map<std::string, std::string> fSystems;  // their files by label, the reference first
+    std::string fBaseline;
+    std::string fReport;
+};
+
+TEST_F(BaselineTest, WhatIsThereIsAcceptedInSortedLines)
+{
+    System("web02", {{"sda", "2"}, {"sdc", "7"}});
+    System("web03", {{"sda", "2"}, {"sdb", "6"}});
+    Accept();
+    EXPECT_EQ("~ Disk.Id=\"sda\" Size: uint16 1 -> uint16 2 in web02, web03\n"
+              "- Disk.Id=\"sdb\" in web02\n"
+              "~ Disk.Id=\"sdb\" Size: uint16 5 -> uint16 6 in web03\n"
+              "+ Disk.Id=\"sdc\" Size: uint16 7 in web02\n",
+              Entries());
+}
+
+TEST_F(BaselineTest, WhatWasAcceptedIsNotReportedAgain)
+{
+    System("web02", {{"sda", "2"}, {"sdc", "7"}});
+    Accept();
+    EXPECT_EQ("Nothing new between web01 and web02 since base.txt: 3 accepted differences.\n", Since());
+    EXPECT_EQ(0, fStatus);
+}
+
+TEST_F(BaselineTest, AcceptingTwiceChangesNothing)
+{
+    System("web02", {{"sda", "2"}, {"sdc", "7"}});
+    Accept();
+    const std::string once = ReadFile(fBaseline);
+    Accept();
+    EXPECT_EQ(once, ReadFile(fBaseline));
+    EXPECT_NE(std::string::npos, fReport.find("\nAccepted in base.txt: nothing new; 3 as before\n")) << fReport;
+}
+
+TEST_F(BaselineTest, OnlyWhatIsNewIsReported)
+{
+    System("web02", {{"sda", "2"}, {"sdb", "5"}});
+    Accept();
+    System("web02", {{"sda", "2"}, {"sdb", "6"}, {"sdc", "7"}});
+    EXPECT_EQ("web01 -> web02: 2 differences (+1 instance, 1 value) in 1 of 2 classes\n"
+              "\n"
+              "Disk  + sdc   Size 7\n"
+              "      ~ sdb.Size: 5 -> 6\n"
+              "\n"
+              "Beside base.txt: 2 new; 1 accepted\n",
+              Since());
+    EXPECT_EQ(1, fStatus);
+}
+
+TEST_F(BaselineTest, AnotherValueThanAcceptedIsReportedWithBoth)
+{
+    System("web02", {{"sda", "2"}, {"sdb", "5"}, {"sdc", "7"}});
+    Accept();
+    System("web02", {{"sda", "3"}, {"sdb", "5"}, {"sdc", "8"}});
+    EXPECT_EQ("web01 -> web02: 2 differences (+1 instance, 1 value) in 1 of 2 classes\n"
+              "\n"
+              "Disk  + sdc   Size 8\n"
+              "      ~ sda.Size: 1 -> 3\n"
+              "\n"
+              "Beside base.txt: 2 changed since; 0 accepted\n"
+              "  changed  ~ Disk.Id=\"sda\" Size: uint16 1 -> uint16 3 in web02; accepted: uint16 1 -> uint16 2\n"
+              "  changed  + Disk.Id=\"sdc\" in web02; has Size: uint16 8; accepted: Size: uint16 7\n",
+              Since());
+    EXPECT_EQ(1, fStatus);
+}
+
+TEST_F(BaselineTest, AnotherValueOfTheReferenceIsAChangeToo)
+{
+    System("web02", {{"sda", "2"}, {"sdb", "5"}});
+    Accept();
+    System("web01", {{"sda", "4"}, {"sdb", "5"}});
+    EXPECT_NE(std::string::npos,
+              Since().find("changed  ~ Disk.Id=\"sda\" Size: uint16 4 -> uint16 2 in web02; accepted: uint16 1"));
+    EXPECT_EQ(1, fStatus);
+}
+
+TEST_F(BaselineTest, WhatIsGoneIsListedAndIsNoDifference)
+{
+    System("web02", {{"sda", "2"}, {"sdc", "7"}});
+    Accept();
+    System("web02", {{"sda", "2"}, {"sdb", "5"}});
+    EXPECT_EQ("Nothing new between web01 and web02 since base.txt: 1 accepted difference.\n"
+              "\n"
+              "Beside base.txt: 2 gone; 1 accepted\n"
+              "  gone     - Disk.Id=\"sdb\" in web02\n"
+              "  gone     + Disk.Id=\"sdc\" in web02\n",
+              Since());
+    EXPECT_EQ(0, fStatus);
+}
+
+TEST_F(BaselineTest, OfAPartlyAcceptedDifferenceOnlyTheNewInventoriesAreReported)
+{
+    System("web02", {{"sda", "2"}, {"sdb", "5"}});
+    System("web03", {{"sda", "1"}, {"sdb", "5"}});
+    Accept();
+    System("web03", {{"sda", "2"}, {"sdb", "5"}});
+    EXPECT_EQ("web01 against 2 others: 1 difference; 1 of 2 differs\n"
+              "    1  web03\n"
+              "\n"
+              "Disk  ~1   sda.Size: 1 -> 2 (web03)\n"
+              "\n"
+              "Beside base.txt: 1 new; 0 accepted\n",
+              Since());
+}
+
+TEST_F(BaselineTest, WhatANewInventoryHoldsIsShownAsItHoldsIt)
+{
+    System("web02", {{"sda", "1"}, {"sdb", "5"}, {"sdc", "7"}});
+    Accept();
+    System("web03", {{"sda", "1"}, {"sdb", "5"}, {"sdc", "8"}});
+    const std::string lines = Compare({"--baseline", fBaseline, "-o", "ndjson"});
+    EXPECT_NE(std::string::npos, lines.find("\"inventories\":[\"web03\"]")) << lines;
+    EXPECT_EQ(std::string::npos, lines.find("disagreements")) << lines;
+    System("web02", {{"sda", "1"}, {"sdb", "5"}});
+    const std::string alone = Compare({"--baseline", fBaseline, "-o", "ndjson"});
+    EXPECT_EQ(alone.substr(0, alone.find('\n')), lines.substr(0, lines.find('\n')));
+}
+
+TEST_F(BaselineTest, ReasonsAndCommentsStayWithWhatStillHolds)
+{
+    System("web02", {{"sda", "2"}, {"sdb", "6"}, {"sdc", "7"}});
+    Accept({"--reason", "moved # in June"});
+    WriteEntries("# of the storage team\n"
+                 "~ Disk.Id=\"sda\" Size: uint16 1 -> uint16 2 in web02  # moved # in June\n"
+                 "# about to go\n"
+                 "~ Disk.Id=\"sdb\" Size: uint16 5 -> uint16 6 in web02  # for a week\n");
+    System("web02", {{"sda", "2"}, {"sdb", "5"}, {"sdc", "7"}});
+    Accept({"--reason", "new shelf"});
+    EXPECT_EQ("# of the storage team\n"
+              "~ Disk.Id=\"sda\" Size: uint16 1 -> uint16 2 in web02  # moved # in June\n"
+              "+ Disk.Id=\"sdc\" Size: uint16 7 in web02  # new shelf\n",
+              Entries());
+    EXPECT_NE(std::string::npos, fReport.find("\nAccepted in base.txt: 1 new, 1 gone and removed; 1 as before\n")) << fReport;
+}
+
+TEST_F(BaselineTest, EntriesOfInventoriesThatAreNotInTheRunStayAndAreCounted)
+{
+    System("web02", {{"sda", "2"}, {"sdb", "5"}});
+    WriteEntries("~ Disk.Id=\"sda\" Size: uint16 1 -> uint16 2 in web02, web09\n"
+                 "- Disk.Id=\"sdb\" in web08\n");
+    EXPECT_EQ("Nothing new between web01 and web02 since base.txt: 1 accepted difference.\n"
+              "\n"
+              "2 accepted differences are for inventories that are not in this run: web08, web09\n",
+              Since());
+    Accept();
+    EXPECT_EQ("~ Disk.Id=\"sda\" Size: uint16 1 -> uint16 2 in web02, web09\n- Disk.Id=\"sdb\" in web08\n", Entries());
+}
+
+TEST_F(BaselineTest, EntriesForWhatWasNotComparedStayAndAreNotGone)
+{
+    System("web02", {{"sda", "2"}, {"sdb", "5"}, {"sdc", "7"}});
+    Accept();
+    const std::string all = Entries();
+    const std::string rules = Scratch("rules.xml", "<DifftoolSpec><class name='Disk' default='include'>"
+                                                   "<excludelist><value>Size</value></excludelist></class></DifftoolSpec>");
+    EXPECT_EQ("Nothing new between web01 and web02 since base.txt: 1 accepted difference; not everything was compared, see below.\n"
+              "\n"
+              "1 accepted difference is for what was not compared: ~ Disk.Id=\"sda\" Size: uint16 1 -> uint16 2 in web02\n",
+              Since({"--spec", rules}));
+    Accept({"--spec", rules});
+    EXPECT_EQ(all, Entries());
+}
+
+TEST_F(BaselineTest, AnEmptyBaselineLeavesTheReportAsItIs)
+{
+    System("web02", {{"sda", "2"}, {"sdc", "7"}});
+    System("web03", {{"sda", "2"}, {"sdb", "6"}});
+    Scratch("base.txt", "");
+    for (const char* const format : {"json", "ndjson"}) {
+        const std::string plain = Compare({"-o", format});
+        const std::string beside = Compare({"-o", format, "--baseline", fBaseline});
+        const std::size_t end = plain.find("\"coverage\"");
+        EXPECT_EQ(plain.substr(0, end), beside.substr(0, beside.find("\"baseline\"")).substr(0, end));
+        EXPECT_EQ(1, fStatus);
+    }
+    EXPECT_EQ("\nBeside base.txt: 4 new; 0 accepted\n", Since().substr(Compare({}).rfind("\n\n") + 1));
+}
+
+TEST_F(BaselineTest, JoinedFilesOfTwoPeopleAreTheUnionOfBoth)
+{
+    System("web02", {{"sda", "2"}, {"sdb", "5"}});
+    Accept();
+    const std::string one = ReadFile(fBaseline);
+    System("web02", {{"sda", "1"}, {"sdb", "6"}});
+    unlink(fBaseline.c_str());
+    Accept();
+    const std::string other = ReadFile(fBaseline);
+    System("web02", {{"sda", "2"}, {"sdb", "6"}});
+    std::ofstream(fBaseline) << other << one << other;
+    EXPECT_EQ("Nothing new between web01 and web02 since base.txt: 2 accepted differences.\n", Since());
+    Accept();
+    EXPECT_EQ("~ Disk.Id=\"sda\" Size: uint16 1 -> uint16 2 in web02\n~ Disk.Id=\"sdb\" Size: uint16 5 -> uint16 6 in web02\n",
+              Entries());
+}
+
+TEST_F(BaselineTest, JsonHasWhatIsGoneAndWhatChanged)
+{
+    System("web02", {{"sda", "2"}, {"sdb", "5"}, {"sdc", "7"}});
+    Accept({"--reason", "tested"});
+    System("web02", {{"sda", "3"}, {"sdb", "5"}});
+    const std::string json = Compare({"--baseline", fBaseline, "-o", "ndjson"});
+    const std::size_t begin = json.find("\"baseline\":");
+    EXPECT_EQ("\"baseline\":{\"file\":\"base.txt\",\"accepting\":false,\"accepted\":0,\"new\":0,\"changedSince\":1,"
+              "\"changed\":[{\"kind\":\"changed\",\"instance\":\"Disk.Id=\\\"sda\\\"\",\"inventories\":[\"web02\"],"
+              "\"values\":[{\"property\":\"Size\",\"reference\":\"uint16 1\",\"other\":\"uint16 3\"}],\"reason\":\"tested\","
+              "\"accepted\":[{\"property\":\"Size\",\"reference\":\"uint16 1\",\"other\":\"uint16 2\"}]}],"
+              "\"gone\":[{\"kind\":\"onlyInOthers\",\"instance\":\"Disk.Id=\\\"sdc\\\"\",\"inventories\":[\"web02\"],"
+              "\"values\":[{\"property\":\"Size\",\"other\":\"uint16 7\"}],\"reason\":\"tested\"}],"
+              "\"notCompared\":[],\"otherInventories\":[],\"entriesOfOtherInventories\":0}",
+              json.substr(begin, json.find(",\"classes\":[") - begin));
+}
+
+TEST_F(BaselineTest, AFileThatCannotBeReadOrWrittenIsRefusedBeforeAnythingElse)
+{
+    System("web02", {{"sda", "2"}});
+    EXPECT_EQ("cimdelta: base.txt: cannot be opened: No such file or directory\n", Compare({"--baseline", fBaseline}));
+    EXPECT_EQ("cimdelta: /no/such/base.txt: cannot be written: No such file or directory\n",
+              Compare({"--accept", "/no/such/base.txt"}));
+    EXPECT_EQ("cimdelta: " + fSystems["web02"] + ": is one of the files that are read; name another file for the result\n",
+              Compare({"--accept", fSystems["web02"]}));
+    EXPECT_EQ("cimdelta: found - for accepted differences, expected a file; name one\n", Compare({"--accept", "-"}));
+    EXPECT_EQ(
+        "cimdelta: base.txt: found for both the result and the accepted differences, expected two files; name another one for "
+        "the result\n",
+        Compare({"--accept", fBaseline, "--output", fBaseline}));
+    EXPECT_EQ("cimdelta: -o cimxml writes the records of all differences, so it cannot be combined with --accept or --baseline; "
+              "choose another format\n",
+              Compare({"--accept", fBaseline, "-o", "cimxml"}));
+}
+
+TEST_F(BaselineTest, AnErrorLeavesTheFileAsItIs)
+{
+    System("web02", {{"sda", "2"}});
+    WriteEntries("~ Disk.Id=\"sda\"\n");
+    const std::string before = ReadFile(fBaseline);
+    EXPECT_EQ("cimdelta: base.txt:4:16: found the end of the entry, expected a property with a colon behind it, such as Size:\n",
+              Compare({"--accept", fBaseline}));
+    EXPECT_EQ(before, ReadFile(fBaseline));
+}
+
+}  // namespace
+}  // namespace NORVZEL20
