@@ -11,7 +11,7 @@ void AddReferenceOptions(CLI::App* command, TCompareOptions& compare)
         "the inventory that the others are compared with, by its label (default: the first), or majority: compare each one with "
         "what most of them have")
         ->option_text("LABEL");
-    command->add_flag("--outliers", compare.reference.isMajority,
+    command->add_flag("--outliers", compare.text.showsOutliers,
                       "show who is odd: what few inventories have, the rarest first, compared with what most of them have");
 }
 

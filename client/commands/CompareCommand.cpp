@@ -22,6 +22,7 @@ namespace NORVZEL20 {
 namespace {
 
 constexpr std::size_t kLeastWidth = 40;
+constexpr std::size_t kMostLinesOnTerminal = 200;
 
 bool IsBesideBaseline(const TBaselineOptions& options)
 {
@@ -48,7 +49,7 @@ std::optional<TBaseline> ReadBaselineIfNamed(const TBaselineOptions& options)
     return options.accept.empty() ? std::nullopt : std::make_optional(ReadBaselineIfAny(options.accept));
 }
 
-// With the colours and the width that fit where the report goes.
+// With the colours, the width and the number of lines that fit where the report goes.
 TTextOptions TextOptions(const TCompareOptions& options, const IConsole& console)
 {
     TTextOptions text = options.text;
@@ -57,6 +58,9 @@ TTextOptions TextOptions(const TCompareOptions& options, const IConsole& console
         options.color == EColorChoice::kAlways || (options.color == EColorChoice::kAuto && isOnConsole && console.IsColored());
     if (const std::size_t width = isOnConsole ? console.GetWidth() : 0; width > 0) {
         text.width = std::max(width, kLeastWidth);
+    }
+    if (text.mostLines == 0 && isOnConsole && console.IsTerminal()) {
+        text.mostLines = kMostLinesOnTerminal;
     }
     return text;
 }
@@ -87,7 +91,9 @@ int RunCompare(const TCompareOptions& options, IConsole& console)
     // Before the inventories, which may take long to load.
     CheckOptions(options);
     CheckSystemNames(options.systems);
-    const std::vector<TInventorySources> sources = options.reference.Apply(options.inventories, options.format);
+    TReferenceChoice reference = options.reference;
+    reference.isMajority = options.text.showsOutliers;
+    const std::vector<TInventorySources> sources = reference.Apply(options.inventories, options.format);
     const std::optional<TRulesText> rules = ReadRulesIfAny(options.rules);
     std::optional<TBaseline> baseline = ReadBaselineIfNamed(options.baseline);
     std::vector<TInventory> inventories = TInventoryLoader(console, options.loading).Load(sources);
@@ -96,7 +102,7 @@ int RunCompare(const TCompareOptions& options, IConsole& console)
     if (!options.allowEmpty && report.coverage.IsNothingCompared()) {
         throw TClientError(DescribeNothingCompared(report, inventories, options.rules, options.strictSchema));
     }
-    if (options.reference.WantsMajority()) {
+    if (reference.WantsMajority()) {
         report = SeeFromMajority(report);
     }
     if (baseline) {

@@ -12,6 +12,7 @@
 #include <utility>
 
 #include "client/findings/ChangeIdentity.h"
+#include "client/findings/DeclaredWords.h"
 
 namespace NORVZEL20 {
 
@@ -28,7 +29,9 @@ bool SharesKey(const TDifference& difference)
 
 }  // namespace
 
-TClassCollector::TClassCollector(TShortNames& names, const std::string& className, std::size_t most) : fNames(names), fMost(most)
+TClassCollector::TClassCollector(const std::vector<TInventory>& inventories, TShortNames& names, const std::string& className,
+                                 std::size_t most)
+    : fInventories(inventories), fNames(names), fMost(most)
 {
     fFindings.className = className;
 }
@@ -43,7 +46,15 @@ void TClassCollector::Add(const TDifference& difference)
     ++counts.changedValues;
     counts.changedInstances += fInstance == difference.instance ? 0 : 1;
     fInstance = difference.instance;
+    ++fFindings.changedProperties[difference.values.front().property];
     AddChange(difference, difference.values.front());
+}
+
+void TClassCollector::AddWords(const std::string& property)
+{
+    if (fFindings.words.count(property) == 0) {
+        fFindings.words.emplace(property, DeclaredWords(fInventories, fFindings.className, property));
+    }
 }
 
 void TClassCollector::AddPresence(const TDifference& difference)
@@ -58,6 +69,9 @@ void TClassCollector::AddPresence(const TDifference& difference)
     known->instances += 1;
     if (known->examples.size() < fMost) {
         known->examples.push_back({fNames.Of(difference), difference.contents, difference.instance});
+        for (const auto& content : difference.contents) {
+            AddWords(content.first);
+        }
     }
 }
 
@@ -72,6 +86,7 @@ void TClassCollector::AddChange(const TDifference& difference, const TValueDiffe
     }
     TProperty& property = fProperties[{change.property, InventoriesOf(change)}];
     ++property.instances;
+    AddWords(change.property);
     const std::string text = WholeText(change);
     const std::hash<std::string> hash;
     const TDigest digest(hash(text), hash("2" + text));

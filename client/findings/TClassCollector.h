@@ -16,8 +16,9 @@ namespace NORVZEL20 {
 /// Groups the differences of one class, which are added in the order of IDifferences.
 class TClassCollector {
   public:
-    /// Of each finding, at most `most` examples are kept. `names` must outlive this.
-    TClassCollector(TShortNames& names, const std::string& className, std::size_t most);
+    /// Of each finding, at most `most` examples are kept. `names` must outlive this, and so must `inventories`, those of the
+    /// report.
+    TClassCollector(const std::vector<TInventory>& inventories, TShortNames& names, const std::string& className, std::size_t most);
 
     const std::string& GetClassName() const { return fFindings.className; }
 
@@ -56,9 +57,11 @@ class TClassCollector {
     using TWhere = std::pair<std::string, std::vector<std::size_t>>;  // the property, and the inventories
 
     void AddPresence(const TDifference& difference);
+    void AddWords(const std::string& property);
     void AddChange(const TDifference& difference, const TValueDifference& change);
     void Keep(TProperty& property, const TDigest& digest, TKnown& known, const TValueDifference& change) const;
 
+    const std::vector<TInventory>& fInventories;
     TShortNames& fNames;
     const std::size_t fMost;
     TClassFindings fFindings;

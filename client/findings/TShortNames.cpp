@@ -31,6 +31,9 @@ std::string TShortNames::Of(const TDifference& difference)
     if (difference.keys.empty()) {
         return difference.hasKeys ? "(any instance)" : "(the only instance)";
     }
+    if (fAreWhole) {
+        return EscapeForDisplay(difference.GetKeyText());
+    }
     return Join(difference.className, difference.keys);
 }
 

@@ -17,8 +17,8 @@ namespace NORVZEL20 {
 /// likewise. No two instances of a class get the same name, unless the rules exclude keys.
 class TShortNames {
   public:
-    /// The inventories must outlive this.
-    explicit TShortNames(const std::vector<TInventory>& inventories) : fInventories(inventories) {}
+    /// The inventories must outlive this. With `areWhole`, no key is left out: the names are as by TDifference::GetKeyText.
+    TShortNames(const std::vector<TInventory>& inventories, bool areWhole) : fInventories(inventories), fAreWhole(areWhole) {}
 
     /// The name of the instance of a difference: `eth0` if one key is left and is text, otherwise `Bus=1,Unit=2`. In brackets what
     /// there is to say of an instance without a key. Cost: for a new class, that of a TDistinctKeys.
@@ -32,6 +32,7 @@ class TShortNames {
     std::string Text(const TDistinctKeys& distinct, const std::string& key, const TCIMValue& value);
 
     const std::vector<TInventory>& fInventories;
+    const bool fAreWhole;
     std::map<std::string, TDistinctKeys> fClasses;
 };
 

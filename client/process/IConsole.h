@@ -27,6 +27,9 @@ class IConsole {
     /// How many columns a result on standard output has: those of the terminal, otherwise COLUMNS; 0 if neither says so.
     virtual std::size_t GetWidth() const = 0;
 
+    /// Whether results on standard output go to a terminal.
+    virtual bool IsTerminal() const { return false; }
+
     /// Replaces the line of progress on standard error, if that is a terminal. An empty text removes the line.
     virtual void ShowProgress(std::string_view text) noexcept = 0;
 };

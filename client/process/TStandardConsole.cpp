@@ -21,7 +21,7 @@ namespace {
 const char kWipeLine[] = "\r\x1b[K";
 
 // A dumb terminal would show escape sequences as text.
-bool IsTerminal(int descriptor)
+bool IsTerminalAt(int descriptor)
 {
     const char* term = std::getenv("TERM");
     return isatty(descriptor) != 0 && (term == nullptr || std::strcmp(term, "dumb") != 0);
@@ -61,8 +61,8 @@ void SayPlainly(std::string_view line) noexcept
 }  // namespace
 
 TStandardConsole::TStandardConsole()
-    : fColored((IsTerminal(STDOUT_FILENO) || IsForced("CLICOLOR_FORCE")) && !IsSet("NO_COLOR")),
-      fProgress(IsTerminal(STDERR_FILENO))
+    : fTerminal(IsTerminalAt(STDOUT_FILENO)), fColored((fTerminal || IsForced("CLICOLOR_FORCE")) && !IsSet("NO_COLOR")),
+      fProgress(IsTerminalAt(STDERR_FILENO))
 {}
 
 void TStandardConsole::WriteResult(std::string_view piece)

@@ -15,10 +15,12 @@ class TStandardConsole : public IConsole {
     void Say(std::string_view line) noexcept override;
     bool IsColored() const override { return fColored; }
     std::size_t GetWidth() const override;
+    bool IsTerminal() const override { return fTerminal; }
     void ShowProgress(std::string_view text) noexcept override;
 
   private:
     std::mutex fMutex;
+    bool fTerminal;
     bool fColored;
     bool fProgress;
     bool fProgressShown = false;

@@ -2,11 +2,13 @@
 
 #include <algorithm>
 #include <boost/algorithm/string/join.hpp>
+#include <numeric>
 #include <set>
 #include <utility>
 #include <vector>
 
 #include "client/report/TValueTexts.h"
+#include "client/text/Counted.h"
 #include "client/text/CutAround.h"
 #include "client/text/DisplayText.h"
 #include "client/text/EmbeddedText.h"
@@ -97,7 +99,7 @@ std::string ElementsChanged(const TCIMValue& from, const TCIMValue& to)
 
 // The text of a value. If all values are plain ones of one type, they are quoted as this line and lists need it; otherwise
 // TValueTexts has found what tells them apart.
-std::string Shown(const TCIMValue& value, const TValueDifference& change, const std::string& text)
+std::string Shown(const TCIMValue& value, const TValueDifference& change, const std::string& text, const TValueWords& words)
 {
     bool arePlain = !HasEmbeddedObject(change.reference);
     for (const TValueDifference::TGroup& group : change.others) {
@@ -105,6 +107,10 @@ std::string Shown(const TCIMValue& value, const TValueDifference& change, const 
     }
     if (!arePlain) {
         return text;
+    }
+    const std::string described = words.Describe(value);
+    if (!described.empty()) {
+        return described;
     }
     return value.GetType().IsArray() ? ListedText(value) : InlineText(value);
 }
@@ -114,26 +120,44 @@ std::string OfGroup(const TValueDifference::TGroup& group, const std::string& te
     return isPair ? text : text + " (" + names.List(group.inventories) + ")";
 }
 
+// The groups in their order; of too many, those that the fewest inventories have.
+std::vector<std::size_t> Choose(const std::vector<TValueDifference::TGroup>& groups, std::size_t most)
+{
+    std::vector<std::size_t> chosen(groups.size());
+    std::iota(chosen.begin(), chosen.end(), static_cast<std::size_t>(0));
+    if (chosen.size() > most) {
+        std::stable_sort(chosen.begin(), chosen.end(), [&groups](std::size_t one, std::size_t other) {
+            return groups[one].inventories.size() < groups[other].inventories.size();
+        });
+        chosen.resize(most);
+    }
+    return chosen;
+}
+
 }  // namespace
 
-std::string ChangeText(const TValueDifference& change, const TInventoryNames& names, bool isPair)
+std::string ChangeText(const TValueDifference& change, const TInventoryNames& names, const TChangeStyle& style)
 {
     const TValueTexts texts(change, true);
-    const std::string reference = Shown(change.reference, change, texts.GetReference());
+    const std::string reference = Shown(change.reference, change, texts.GetReference(), style.words);
     if (change.others.size() == 1) {
         const TValueDifference::TGroup& group = change.others.front();
         const std::string elements = ElementsChanged(change.reference, group.value);
         if (!elements.empty()) {
-            return OfGroup(group, elements, names, isPair);
+            return OfGroup(group, elements, names, style.isPair);
         }
-        const auto [before, after] = CutAround(reference, Shown(group.value, change, texts.GetOther(0)));
-        return before + kBeforeNewValue + OfGroup(group, after, names, isPair);
+        const std::string other = Shown(group.value, change, texts.GetOther(0), style.words);
+        const auto [before, after] = style.isWhole ? std::make_pair(reference, other) : CutAround(reference, other);
+        return before + kBeforeNewValue + OfGroup(group, after, names, style.isPair);
     }
     std::vector<std::string> groups;
-    for (std::size_t i = 0; i < change.others.size(); ++i) {
-        groups.push_back(OfGroup(change.others[i], Shown(change.others[i].value, change, texts.GetOther(i)), names, isPair));
+    for (const std::size_t i : Choose(change.others, style.mostValues)) {
+        const std::string text = Shown(change.others[i].value, change, texts.GetOther(i), style.words);
+        groups.push_back(OfGroup(change.others[i], text, names, style.isPair));
     }
-    return reference + kBeforeNewValue + boost::algorithm::join(groups, kBetweenValues);
+    const std::size_t rest = change.others.size() - groups.size();
+    return reference + kBeforeNewValue + boost::algorithm::join(groups, kBetweenValues) +
+           (rest > 0 ? "   ... " + Counted(rest, "more value", "more values") + " (--detail)" : std::string());
 }
 
 }  // namespace NORVZEL20

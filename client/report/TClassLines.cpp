@@ -15,6 +15,8 @@
 
 #include <algorithm>
 #include <boost/algorithm/string/join.hpp>
+#include <numeric>
+#include <set>
 
 #include "client/report/ChangeText.h"
 #include "client/text/Counted.h"
@@ -26,6 +28,13 @@ namespace NORVZEL20 {
 namespace {
 
 const char kSharesKey[] = "   (instances share this key: --detail)";
+
+// Whether fewer inventories are concerned.
+template <class TFinding>
+bool IsRarer(const TFinding* one, const TFinding* other)
+{
+    return one->inventories.size() < other->inventories.size();
+}
 
 std::string More(std::size_t count)
 {
@@ -53,13 +62,67 @@ std::string TClassLines::Counts() const
 std::vector<TClassLines::TLine> TClassLines::Write()
 {
     fLines.clear();
-    for (const TPresenceFinding& presence : fFindings.presences) {
-        fIsPair ? AddPresenceOfPair(presence) : AddPresence(presence);
-    }
+    AddPresences(TDifference::kOnlyInReference);
+    AddPresences(TDifference::kOnlyInOthers);
+    std::vector<const TPropertyFinding*> ofOne;  // property
     for (const TPropertyFinding& property : fFindings.properties) {
-        AddProperty(property);
+        if (!ofOne.empty() && ofOne.front()->property != property.property) {
+            AddProperties(std::move(ofOne));
+            ofOne.clear();
+        }
+        ofOne.push_back(&property);
     }
+    AddProperties(std::move(ofOne));
     return std::move(fLines);
+}
+
+// Of too many groups, those that the fewest inventories are in, since they say who is odd.
+void TClassLines::AddPresences(TDifference::EKind kind)
+{
+    std::vector<const TPresenceFinding*> presences;
+    for (const TPresenceFinding& presence : fFindings.presences) {
+        if (presence.kind == kind) {
+            presences.push_back(&presence);
+        }
+    }
+    std::size_t rest = 0;
+    if (presences.size() > fMost) {
+        std::stable_sort(presences.begin(), presences.end(), &IsRarer<TPresenceFinding>);
+        rest = std::accumulate(presences.begin() + static_cast<std::ptrdiff_t>(fMost), presences.end(), rest,
+                               [](std::size_t sum, const TPresenceFinding* presence) { return sum + presence->instances; });
+        presences.resize(fMost);
+    }
+    for (const TPresenceFinding* const presence : presences) {
+        fIsPair ? AddPresenceOfPair(*presence) : AddPresence(*presence);
+    }
+    if (rest > 0) {
+        AddOtherPresences(kind, rest);
+    }
+}
+
+void TClassLines::AddOtherPresences(TDifference::EKind kind, std::size_t instances)
+{
+    const bool isMissing = kind == TDifference::kOnlyInReference;
+    fLines.push_back({"... " + Counted(instances, "more instance") +
+                          (isMissing ? " missing in various inventories" : " only in various inventories") + " (--detail)",
+                      kind});
+}
+
+void TClassLines::AddProperties(std::vector<const TPropertyFinding*> ofOne)
+{
+    std::vector<const TPropertyFinding*> rest;
+    if (ofOne.size() > fMost) {
+        std::vector<const TPropertyFinding*> byRarity = ofOne;
+        std::stable_sort(byRarity.begin(), byRarity.end(), &IsRarer<TPropertyFinding>);
+        ofOne.assign(byRarity.begin(), byRarity.begin() + static_cast<std::ptrdiff_t>(fMost));
+        rest.assign(byRarity.begin() + static_cast<std::ptrdiff_t>(fMost), byRarity.end());
+    }
+    for (const TPropertyFinding* const property : ofOne) {
+        AddProperty(*property);
+    }
+    if (!rest.empty()) {
+        AddOtherChanges(rest);
+    }
 }
 
 void TClassLines::AddPresence(const TPresenceFinding& presence)
@@ -68,10 +131,9 @@ void TClassLines::AddPresence(const TPresenceFinding& presence)
     for (const TPresenceFinding::TExample& example : presence.examples) {
         names.push_back(example.name);
     }
-    const bool isMissing = presence.kind == TDifference::kOnlyInReference;
-    fLines.push_back(
-        {(isMissing ? "missing in " : "only in ") + fNames.List(presence.inventories) + ": " + Shorten(names, presence.instances),
-         presence.kind});
+    const std::string who = presence.kind == TDifference::kOnlyInReference ? fNames.WhoLacks(presence.inventories)
+                                                                           : fNames.WhoHas(presence.inventories);
+    fLines.push_back({who + ": " + Shorten(names, presence.instances), presence.kind});
 }
 
 void TClassLines::AddPresenceOfPair(const TPresenceFinding& presence)
@@ -105,8 +167,8 @@ void TClassLines::AddChange(const TChangeFinding& change)
     const std::string sign = fIsPair ? "~ " : "";
     const std::string property = EscapeForDisplay(change.change.property);
     const std::string text = change.instances == 1
-                                 ? change.names.front() + "." + property + ": " + Change(change)
-                                 : property + ": " + Change(change) + ": " + Shorten(change.names, change.instances);
+                                 ? change.names.front() + "." + property + ": " + Change(change, fIsPair)
+                                 : property + ": " + Change(change, fIsPair) + ": " + Shorten(change.names, change.instances);
     fLines.push_back({sign + text, TDifference::kChanged});
 }
 
@@ -121,6 +183,23 @@ void TClassLines::AddManyChanges(const TPropertyFinding& property)
         {"  " + First(example) + ": " + ExampleOf(property) + "   " + More(property.changes - 1), TDifference::kChanged});
 }
 
+// The same property in many sets of inventories.
+void TClassLines::AddOtherChanges(const std::vector<const TPropertyFinding*>& rest)
+{
+    std::size_t instances = 0;
+    std::size_t changes = 0;
+    std::set<std::size_t> inventories;
+    for (const TPropertyFinding* const property : rest) {
+        instances += property->instances;
+        changes += property->changes;
+        inventories.insert(property->inventories.begin(), property->inventories.end());
+    }
+    fLines.push_back({(fIsPair ? "~ " : "") + EscapeForDisplay(rest.front()->property) + " in " +
+                          Counted(instances, "more instance") + " (" + fNames.List({inventories.begin(), inventories.end()}) +
+                          "), " + Counted(changes, "distinct change") + " (--detail)",
+                      TDifference::kChanged});
+}
+
 // The first of the instances, and how many there are beside it.
 std::string TClassLines::First(const TChangeFinding& change)
 {
@@ -133,12 +212,14 @@ std::string TClassLines::ExampleOf(const TPropertyFinding& property) const
     const TChangeFinding& example = property.examples.front();
     const std::vector<TValueDifference::TGroup>& groups = example.change.others;
     const bool areAll = groups.size() == 1 && groups.front().inventories == property.inventories;
-    return ChangeText(example.change, fNames, fIsPair || areAll) + (example.isShared ? kSharesKey : "");
+    return Change(example, fIsPair || areAll);
 }
 
-std::string TClassLines::Change(const TChangeFinding& change) const
+// Without the names of inventories if `isPair`.
+std::string TClassLines::Change(const TChangeFinding& change, bool isPair) const
 {
-    return ChangeText(change.change, fNames, fIsPair) + (change.isShared ? kSharesKey : "");
+    const TChangeStyle style{isPair, fOptions.hasWholeKeys, fMost, fFindings.WordsFor(change.change.property)};
+    return ChangeText(change.change, fNames, style) + (change.isShared ? kSharesKey : "");
 }
 
 // Names of several keys have commas in them.
@@ -158,8 +239,10 @@ std::string TClassLines::Contents(const TPresenceFinding::TExample& example) con
 {
     std::string text;
     for (const auto& [property, value] : example.contents) {
-        const std::string next = (text.empty() ? "" : ", ") + EscapeForDisplay(property) + " " + ListedText(value);
-        if (fOptions.width > 0 && example.name.size() + text.size() + next.size() > fOptions.width) {
+        const std::string words = fFindings.WordsFor(property).Describe(value);
+        const std::string next =
+            (text.empty() ? "" : ", ") + EscapeForDisplay(property) + " " + (words.empty() ? ListedText(value) : words);
+        if (fOptions.width > 0 && !fOptions.hasWholeKeys && example.name.size() + text.size() + next.size() > fOptions.width) {
             return text + (text.empty() ? "..." : ", ...");
         }
         text += next;

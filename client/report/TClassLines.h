@@ -32,14 +32,18 @@ class TClassLines {
     std::vector<TLine> Write();
 
   private:
+    void AddPresences(TDifference::EKind kind);
     void AddPresence(const TPresenceFinding& presence);
+    void AddOtherPresences(TDifference::EKind kind, std::size_t instances);
     void AddPresenceOfPair(const TPresenceFinding& presence);
+    void AddProperties(std::vector<const TPropertyFinding*> ofOne);
     void AddProperty(const TPropertyFinding& property);
+    void AddOtherChanges(const std::vector<const TPropertyFinding*>& rest);
     void AddChange(const TChangeFinding& change);
     void AddManyChanges(const TPropertyFinding& property);
     static std::string First(const TChangeFinding& change);
     std::string ExampleOf(const TPropertyFinding& property) const;
-    std::string Change(const TChangeFinding& change) const;
+    std::string Change(const TChangeFinding& change, bool isPair) const;
     std::string Shorten(const std::vector<std::string>& names, std::size_t count) const;
     std::string Contents(const TPresenceFinding::TExample& example) const;
 

@@ -17,45 +17,28 @@
 //       Version in 43 instances (web21..23), 43 distinct changes
 //         curl: 7.88.1-10 -> 7.88.1-10+deb12u5   ... 42 more (--detail)
 //
-// Groups are shown whole as long as they are small and the lines are not more than asked for.
+// TClassTable lays out the classes.
 #include "client/report/TGroupedText.h"
 
 #include <algorithm>
 #include <boost/algorithm/string/join.hpp>
 #include <map>
 
+#include "client/findings/CollectOutliers.h"
 #include "client/report/BaselineText.h"
 #include "client/report/DescribeAgreement.h"
+#include "client/report/DescribeLargestGroup.h"
 #include "client/report/DisplayLabels.h"
 #include "client/report/ShortCoverage.h"
+#include "client/report/TClassLines.h"
+#include "client/report/TClassTable.h"
 #include "client/report/TextColors.h"
 #include "client/report/TextCoverage.h"
+#include "client/report/WriteOutliers.h"
 #include "client/text/Counted.h"
 #include "client/text/DisplayText.h"
 
 namespace NORVZEL20 {
-
-namespace {
-
-// How many members of a group are shown: as many as possible, in these steps, so that the lines fit.
-constexpr std::size_t kMostMembers[] = {8, 4, 2, 1};
-
-constexpr std::size_t kLongestInColumn = 32;
-const char kBeforeContents[] = "   ";
-
-const char* ColorOf(TDifference::EKind kind)
-{
-    switch (kind) {
-    case TDifference::kOnlyInReference:
-        return kRed;
-    case TDifference::kOnlyInOthers:
-        return kGreen;
-    default:
-        return kYellow;
-    }
-}
-
-}  // namespace
 
 std::string TGroupedText::Write() const
 {
@@ -67,7 +50,8 @@ std::string TGroupedText::Write() const
         text += "\n" + (fOptions.isSummary ? ClassCounts() : Findings());
     }
     text += WriteBaselineText(fReport, fOptions);
-    return text + "\n" + (fOptions.hasWholeCoverage ? WriteTextCoverage(fReport) : WriteShortCoverage(fReport));
+    return text + "\n" + (fOptions.hasWholeCoverage ? WriteTextCoverage(fReport) : WriteShortCoverage(fReport)) +
+           DescribeLargestGroup(fFindings, fReport.differences->GetCounts().GetTotal());
 }
 
 std::string TGroupedText::Summary() const
@@ -84,6 +68,10 @@ std::string TGroupedText::Summary() const
     const std::size_t others = fReport.labels.size() - 1;
     const auto differ = static_cast<std::size_t>(
         std::count_if(fFindings.differences.begin(), fFindings.differences.end(), [](std::size_t count) { return count > 0; }));
+    if (fReport.run) {
+        return std::to_string(others) + " inventories against what most of them have: " + Counted(total, "difference") + "; " +
+               (differ == others ? "all" : std::to_string(differ)) + (differ == 1 ? " differs" : " differ");
+    }
     return DisplayLabel(fReport.labels[0]) + " against " + std::to_string(others) + " others: " + Counted(total, "difference") +
            "; " +
            (differ == others ? (others == 2 ? "both" : "all " + std::to_string(others)) + " differ"
@@ -138,14 +126,13 @@ std::string TGroupedText::WhoDiffers() const
 
 std::string TGroupedText::Findings() const
 {
-    std::vector<std::string> lines;
-    for (const std::size_t most : kMostMembers) {
-        lines = Lines(most);
-        if (fOptions.mostLines == 0 || lines.size() <= fOptions.mostLines) {
-            break;
-        }
+    if (fOptions.showsOutliers) {
+        const std::string outliers = WriteOutliers(CollectOutliers(fReport, fOptions.hasWholeKeys), fNames, fOptions);
+        return outliers.substr(0, outliers.size() - 1);  // an empty line follows
     }
-    return boost::algorithm::join(lines, "\n") + "\n";
+    return boost::algorithm::join(TClassTable(fFindings.classes, fNames, fOptions, IsPair()).WriteWithin(fOptions.mostLines),
+                                  "\n") +
+           "\n";
 }
 
 // Each class with its counts.
@@ -158,100 +145,15 @@ std::string TGroupedText::ClassCounts() const
     std::string text;
     for (const TClassFindings& findings : fFindings.classes) {
         const std::string name = EscapeForDisplay(findings.className);
-        text += Bold(name) + std::string(width - name.size() + 2, ' ') + ClassLines(findings, 1).Counts() + "\n";
+        text += Bold(name) + std::string(width - name.size() + 2, ' ') +
+                TClassLines(findings, fNames, fOptions, IsPair(), 1).Counts() + "\n";
     }
     return text;
-}
-
-std::vector<std::string> TGroupedText::Lines(std::size_t most) const
-{
-    std::vector<std::vector<TClassLines::TLine>> classes;
-    std::size_t column = 0;  // in which contents stand, unless a name is much longer than most
-    for (const TClassFindings& findings : fFindings.classes) {
-        classes.push_back(ClassLines(findings, most).Write());
-        for (const TClassLines::TLine& line : classes.back()) {
-            const bool counts = !line.contents.empty() && line.text.size() <= kLongestInColumn;
-            column = counts ? std::max(column, line.text.size()) : column;
-        }
-    }
-    const std::vector<std::string> heads = Heads();
-    std::vector<std::string> all;
-    for (std::size_t i = 0; i < classes.size(); ++i) {
-        if (IsPair()) {
-            AppendPair(all, heads[i], classes[i], column);
-        } else {
-            AppendMany(all, heads[i], classes[i]);
-        }
-    }
-    return all;
-}
-
-TClassLines TGroupedText::ClassLines(const TClassFindings& findings, std::size_t most) const
-{
-    return TClassLines(findings, fNames, fOptions, IsPair(), most);
-}
-
-// What the first line of each class begins with, all equally wide: the name, and for several inventories the counts.
-std::vector<std::string> TGroupedText::Heads() const
-{
-    std::vector<std::string> names;
-    std::vector<std::string> counts;
-    std::size_t width = 0;
-    for (const TClassFindings& findings : fFindings.classes) {
-        names.push_back(EscapeForDisplay(findings.className) + "  ");
-        counts.push_back(IsPair() ? std::string() : ClassLines(findings, 1).Counts());
-        width = std::max(width, names.back().size() + counts.back().size());
-    }
-    for (std::size_t i = 0; i < names.size(); ++i) {
-        names[i] += std::string(width - names[i].size() - counts[i].size(), ' ') + counts[i] + (IsPair() ? "" : "   ");
-    }
-    return names;
-}
-
-void TGroupedText::AppendPair(std::vector<std::string>& all, const std::string& head, const std::vector<TClassLines::TLine>& lines,
-                              std::size_t column) const
-{
-    for (std::size_t i = 0; i < lines.size(); ++i) {
-        const std::size_t gap = std::max(column, lines[i].text.size()) - lines[i].text.size();
-        all.push_back((i == 0 ? Bold(head) : std::string(head.size(), ' ')) + Colored(lines[i]) +
-                      (lines[i].contents.empty() ? std::string() : std::string(gap, ' ') + kBeforeContents + lines[i].contents));
-    }
-}
-
-// Instances that some lack share the first line, since they are the shortest.
-void TGroupedText::AppendMany(std::vector<std::string>& all, const std::string& head,
-                              const std::vector<TClassLines::TLine>& lines) const
-{
-    std::vector<std::string> presences;
-    std::size_t next = 0;
-    for (; next < lines.size() && lines[next].kind != TDifference::kChanged; ++next) {
-        presences.push_back(Colored(lines[next]));
-    }
-    if (presences.empty()) {
-        presences.push_back(Colored(lines[next++]));
-    }
-    const std::string joined = boost::algorithm::join(presences, ";  ");
-    if (presences.size() > 1 && fOptions.width > 0 && head.size() + joined.size() > fOptions.width) {
-        all.push_back(Bold(head) + presences.front());
-        for (std::size_t i = 1; i < presences.size(); ++i) {
-            all.push_back("    " + presences[i]);
-        }
-    } else {
-        all.push_back(Bold(head) + joined);
-    }
-    for (; next < lines.size(); ++next) {
-        all.push_back("    " + Colored(lines[next]));
-    }
 }
 
 std::string TGroupedText::Bold(const std::string& text) const
 {
     return Paint(fOptions.isColored, kBold, text);
-}
-
-std::string TGroupedText::Colored(const TClassLines::TLine& line) const
-{
-    return Paint(fOptions.isColored, ColorOf(line.kind), line.text);
 }
 
 }  // namespace NORVZEL20

@@ -1,12 +1,9 @@
 #pragma once
 
-#include <cstddef>
 #include <string>
-#include <vector>
 
 #include "client/comparison/TComparisonReport.h"
 #include "client/findings/TFindings.h"
-#include "client/report/TClassLines.h"
 #include "client/report/TInventoryNames.h"
 #include "client/report/TTextOptions.h"
 
@@ -17,7 +14,7 @@ class TGroupedText {
   public:
     /// The arguments must outlive this.
     TGroupedText(const TComparisonReport& report, const TFindings& findings, const TTextOptions& options)
-        : fReport(report), fFindings(findings), fOptions(options), fNames(report.labels)
+        : fReport(report), fFindings(findings), fOptions(options), fNames(report.labels, report.run != nullptr)
     {}
 
     /// The whole text, coverage included. Errors: std::bad_alloc.
@@ -31,14 +28,7 @@ class TGroupedText {
     std::string WhoDiffers() const;
     std::string Findings() const;
     std::string ClassCounts() const;
-    std::vector<std::string> Lines(std::size_t most) const;
-    std::vector<std::string> Heads() const;
-    TClassLines ClassLines(const TClassFindings& findings, std::size_t most) const;
-    void AppendPair(std::vector<std::string>& all, const std::string& head, const std::vector<TClassLines::TLine>& lines,
-                    std::size_t column) const;
-    void AppendMany(std::vector<std::string>& all, const std::string& head, const std::vector<TClassLines::TLine>& lines) const;
     std::string Bold(const std::string& text) const;
-    std::string Colored(const TClassLines::TLine& line) const;
     bool IsPair() const { return fReport.labels.size() == 2; }
 
     const TComparisonReport& fReport;

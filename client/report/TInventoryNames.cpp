@@ -46,23 +46,45 @@ bool IsNext(const std::string& label, const std::string& next)
 
 std::string TInventoryNames::List(const std::vector<std::size_t>& inventories) const
 {
+    if (!AreNearlyAll(inventories)) {
+        return Ranges(inventories);
+    }
+    const std::vector<std::size_t> others = Others(inventories, 1);
+    return others.empty() ? "all" : "all but " + Ranges(others);
+}
+
+std::string TInventoryNames::WhoLacks(const std::vector<std::size_t>& inventories) const
+{
+    const std::vector<std::size_t> others = Others(inventories, fHasMajority ? 1 : 0);
+    return AreNearlyAll(inventories) && !others.empty() ? "only in " + Ranges(others) : "missing in " + List(inventories);
+}
+
+std::string TInventoryNames::WhoHas(const std::vector<std::size_t>& inventories) const
+{
+    const std::vector<std::size_t> others = Others(inventories, fHasMajority ? 1 : 0);
+    return AreNearlyAll(inventories) && !others.empty() ? "missing in " + Ranges(others) + " alone"
+                                                        : "only in " + List(inventories);
+}
+
+// Whether they are all others, or so many that it is shorter to name those that are not among them.
+bool TInventoryNames::AreNearlyAll(const std::vector<std::size_t>& inventories) const
+{
     const std::size_t others = fLabels.size() - 1;
     if (inventories.front() == 0 || others < kFewestForAll) {
-        return Ranges(inventories);
+        return false;
     }
-    if (inventories.size() == others) {
-        return "all";
-    }
-    if (others < kFewestForAllBut || others - inventories.size() > kMostExceptions) {
-        return Ranges(inventories);
-    }
-    std::vector<std::size_t> missing;
-    for (std::size_t i = 1; i < fLabels.size(); ++i) {
+    return inventories.size() == others || (others >= kFewestForAllBut && others - inventories.size() <= kMostExceptions);
+}
+
+std::vector<std::size_t> TInventoryNames::Others(const std::vector<std::size_t>& inventories, std::size_t first) const
+{
+    std::vector<std::size_t> others;
+    for (std::size_t i = first; i < fLabels.size(); ++i) {
         if (!std::binary_search(inventories.begin(), inventories.end(), i)) {
-            missing.push_back(i);
+            others.push_back(i);
         }
     }
-    return "all but " + Ranges(missing);
+    return others;
 }
 
 std::string TInventoryNames::Ranges(const std::vector<std::size_t>& inventories) const

@@ -10,6 +10,8 @@ struct TTextOptions {
     bool isDetailed = false;        ///< every difference on its own, with the whole coverage
     bool isSummary = false;         ///< who differs and how much, without the findings
     bool hasWholeCoverage = false;  ///< the whole coverage, not only its summary
+    bool showsOutliers = false;     ///< by inventories, rarest first, instead of by class; the reference is the majority
+    bool hasWholeKeys = false;      ///< keys and values whole, however long
     std::size_t width = 120;        ///< columns at which contents are cut; 0 for no limit
     std::size_t mostLines = 0;      ///< how long the findings may be if groups are shortened; 0 for no limit
 };

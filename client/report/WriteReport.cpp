@@ -18,7 +18,7 @@ void WriteText(const TComparisonReport& report, const TTextOptions& options, con
     if (options.isDetailed) {
         return TTextFormat(report, options).Write(sink);
     }
-    const TFindings findings = CollectFindings(report);
+    const TFindings findings = CollectFindings(report, kMostExamples, options.hasWholeKeys);
     sink(TGroupedText(report, findings, options).Write());
 }
 

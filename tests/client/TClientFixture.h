@@ -35,6 +35,7 @@ class TClientFixture : public ::testing::Test {
         TFakeConsole console;
         console.fColored = fColored;
         console.fWidth = fWidth;
+        console.fTerminal = fTerminal;
         fStatus = RunClient(static_cast<int>(argv.size()), argv.data(), console);
         fOut = console.fOut;
         fErr = console.fErr;
@@ -87,6 +88,7 @@ class TClientFixture : public ::testing::Test {
     std::string fErr;
     bool fColored = false;
     std::size_t fWidth = 0;
+    bool fTerminal = false;
     std::vector<std::string> fScratch;
 };
 

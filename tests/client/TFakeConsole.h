@@ -18,6 +18,7 @@ class TFakeConsole : public IConsole {
     }
     bool IsColored() const override { return fColored; }
     std::size_t GetWidth() const override { return fWidth; }
+    bool IsTerminal() const override { return fTerminal; }
     void ShowProgress(std::string_view text) noexcept override
     {
         const std::lock_guard<std::mutex> lock(fMutex);
@@ -29,6 +30,7 @@ class TFakeConsole : public IConsole {
     std::string fProgress;
     bool fColored = false;
     std::size_t fWidth = 0;
+    bool fTerminal = false;
 
   private:
     std::mutex fMutex;

@@ -157,7 +157,8 @@ TEST_F(GroupedReportTest, OfManySystemsSaysFirstWhoIsOdd)
               "    Version in 12 instances (web21..23), 12 distinct changes\n"
               "      p1: 1.0-1 -> 1.1-1   ... 11 more (--detail)\n"
               "\n"
-              "19 to 22 instances of each in 6 classes compared\n",
+              "19 to 22 instances of each in 6 classes compared\n"
+              "12 of 18 differences are Package.Version: --exclude Package.Version\n",
               Compare());
 }
 
