@@ -93,7 +93,11 @@ int RunCompare(const TCompareOptions& options, IConsole& console)
     CheckSystemNames(options.systems);
     TReferenceChoice reference = options.reference;
     reference.isMajority = options.text.showsOutliers;
-    const std::vector<TInventorySources> sources = reference.Apply(options.inventories, options.format);
+    if (reference.WantsMajority() && options.format == EOutputFormat::kCimXml) {
+        throw TClientError("the records of -o cimxml name the differences from an inventory, not from the majority; use another "
+                           "format, or name an inventory with --reference");
+    }
+    const std::vector<TInventorySources> sources = reference.Apply(options.inventories);
     const std::optional<TRulesText> rules = ReadRulesIfAny(options.rules);
     std::optional<TBaseline> baseline = ReadBaselineIfNamed(options.baseline);
     std::vector<TInventory> inventories = TInventoryLoader(console, options.loading).Load(sources);

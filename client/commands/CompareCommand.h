@@ -5,9 +5,9 @@
 
 #include "client/baseline/ApplyBaseline.h"
 #include "client/commands/EColorChoice.h"
-#include "client/commands/TReferenceChoice.h"
 #include "client/inventory/TInventorySources.h"
 #include "client/inventory/TLoadingOptions.h"
+#include "client/inventory/TReferenceChoice.h"
 #include "client/inventory/TSystemNames.h"
 #include "client/process/IConsole.h"
 #include "client/report/EOutputFormat.h"

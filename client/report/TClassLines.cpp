@@ -4,7 +4,7 @@
 //   ~ rsyslog.Started: TRUE -> FALSE                  a change of one instance
 //   ~ MTU: 1500 -> 9000: eth0, eth1                   the same change of several
 //   ~ Version in 43 instances, 43 distinct changes    many changes of one property, with an example
-//       curl: 7.88.1-10 -> 7.88.1-12   ... 42 more (--detail)
+//       curl: 7.88.1-10 -> 7.88.1-12   ... 42 more (--property Version)
 //
 //   missing in web23: font11, libdev5
 //   only in web07: cryptominer
@@ -18,6 +18,7 @@
 #include <numeric>
 #include <set>
 
+#include "client/findings/CollectFindings.h"
 #include "client/report/ChangeText.h"
 #include "client/text/Counted.h"
 #include "client/text/DisplayText.h"
@@ -179,8 +180,7 @@ void TClassLines::AddManyChanges(const TPropertyFinding& property)
                           Counted(property.instances, "instance") + where + ", " + Counted(property.changes, "distinct change"),
                       TDifference::kChanged});
     const TChangeFinding& example = property.examples.front();
-    fLines.push_back(
-        {"  " + First(example) + ": " + ExampleOf(property) + "   " + More(property.changes - 1), TDifference::kChanged});
+    fLines.push_back({"  " + First(example) + ": " + ExampleOf(property) + "   " + MoreChanges(property), TDifference::kChanged});
 }
 
 // The same property in many sets of inventories.
@@ -204,6 +204,15 @@ void TClassLines::AddOtherChanges(const std::vector<const TPropertyFinding*>& re
 std::string TClassLines::First(const TChangeFinding& change)
 {
     return change.names.front() + (change.instances == 1 ? std::string() : " and " + Counted(change.instances - 1, "other"));
+}
+
+// The option shows a group whole that is no larger than what is kept of it.
+std::string TClassLines::MoreChanges(const TPropertyFinding& property) const
+{
+    const bool isEnough = property.changes <= kMostExamples && !fOptions.hasWholeGroups;
+    return "... " + std::to_string(property.changes - 1) + " more (" +
+           (isEnough ? "--property " + EscapeForDisplay(property.property.substr(0, property.property.find('.'))) : "--detail") +
+           ")";
 }
 
 // The first change. Its inventories are left out if they are those of the property, which stand above it.

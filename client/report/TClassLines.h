@@ -42,6 +42,7 @@ class TClassLines {
     void AddChange(const TChangeFinding& change);
     void AddManyChanges(const TPropertyFinding& property);
     static std::string First(const TChangeFinding& change);
+    std::string MoreChanges(const TPropertyFinding& property) const;
     std::string ExampleOf(const TPropertyFinding& property) const;
     std::string Change(const TChangeFinding& change, bool isPair) const;
     std::string Shorten(const std::vector<std::string>& names, std::size_t count) const;

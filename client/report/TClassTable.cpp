@@ -8,7 +8,7 @@
 //   KALMO_FileSystem      ~1   /srv.MountOptions: -noexec (web31)
 //   KALMO_Package  -2 +1 ~43   missing in web23: font11, libdev5;  only in web07: cryptominer
 //       Version in 43 instances (web21..23), 43 distinct changes
-//         curl: 7.88.1-10 -> 7.88.1-10+deb12u5   ... 42 more (--detail)
+//         curl: 7.88.1-10 -> 7.88.1-10+deb12u5   ... 42 more (--property Version)
 //
 // Groups are whole as long as they are small and the lines are not more than asked for.
 #include "client/report/TClassTable.h"
@@ -17,6 +17,7 @@
 #include <boost/algorithm/string/join.hpp>
 #include <numeric>
 
+#include "client/findings/CollectFindings.h"
 #include "client/report/TextColors.h"
 #include "client/text/Counted.h"
 #include "client/text/DisplayText.h"
@@ -64,8 +65,12 @@ std::vector<std::string> TClassTable::Write(std::size_t most) const
 
 std::vector<std::string> TClassTable::WriteWithin(std::size_t mostLines) const
 {
+    std::vector<std::size_t> steps(std::begin(kMostMembers), std::end(kMostMembers));
+    if (fOptions.hasWholeGroups) {
+        steps.insert(steps.begin(), kMostExamples);
+    }
     std::vector<TLines> classes;
-    for (const std::size_t most : kMostMembers) {
+    for (const std::size_t most : steps) {
         classes = WriteClasses(most);
         if (mostLines == 0 || CountLines(classes) <= mostLines) {
             return Join(classes);

@@ -12,6 +12,7 @@ struct TTextOptions {
     bool hasWholeCoverage = false;  ///< the whole coverage, not only its summary
     bool showsOutliers = false;     ///< by inventories, rarest first, instead of by class; the reference is the majority
     bool hasWholeKeys = false;      ///< keys and values whole, however long
+    bool hasWholeGroups = false;    ///< groups whole, if the lines are not too many: few properties were asked for
     std::size_t width = 120;        ///< columns at which contents are cut; 0 for no limit
     std::size_t mostLines = 0;      ///< how long the findings may be if groups are shortened; 0 for no limit
 };

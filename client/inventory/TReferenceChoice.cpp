@@ -25,7 +25,7 @@ constexpr std::size_t kFewestForMajority = 3;
                        " For --reference give one of these labels, or majority: " + SomeOf(labels));
 }
 
-void CheckMajority(const std::vector<std::string>& labels, EOutputFormat format)
+void CheckMajority(const std::vector<std::string>& labels)
 {
     if (labels.size() < kFewestForMajority) {
         throw TClientError(
@@ -34,10 +34,6 @@ void CheckMajority(const std::vector<std::string>& labels, EOutputFormat format)
     if (std::find(labels.begin(), labels.end(), kMajorityLabel) != labels.end()) {
         throw TClientError("an inventory is called majority, so reports could not tell it from the majority of the inventories; "
                            "give it another label: LABEL=SOURCE");
-    }
-    if (format == EOutputFormat::kCimXml) {
-        throw TClientError("the records of -o cimxml name the differences from an inventory, not from the majority; use another "
-                           "format, or name an inventory with --reference");
     }
 }
 
@@ -48,11 +44,11 @@ bool TReferenceChoice::WantsMajority() const
     return isMajority || name == kMajorityLabel;
 }
 
-std::vector<TInventorySources> TReferenceChoice::Apply(std::vector<TInventorySources> inventories, EOutputFormat format) const
+std::vector<TInventorySources> TReferenceChoice::Apply(std::vector<TInventorySources> inventories) const
 {
     const std::vector<std::string> labels = MakeInventoryLabels(inventories);
     if (WantsMajority()) {
-        CheckMajority(labels, format);
+        CheckMajority(labels);
     }
     if (name.empty() || name == kMajorityLabel) {
         return inventories;

@@ -4,9 +4,11 @@
 #include <vector>
 
 #include "client/inventory/TInventorySources.h"
-#include "client/report/EOutputFormat.h"
 
 namespace NORVZEL20 {
+
+/// What stands for the majority among labels.
+inline constexpr char kMajorityLabel[] = "majority";
 
 /// What the others are compared with: an inventory, or what most inventories have.
 struct TReferenceChoice {
@@ -16,9 +18,8 @@ struct TReferenceChoice {
     bool WantsMajority() const;
 
     /// The inventories with the chosen one in front and the others in their order. Errors: TClientError for a name that no
-    /// inventory has; for the majority, also if there are fewer than three inventories, one has its label or the format cannot show
-    /// it.
-    std::vector<TInventorySources> Apply(std::vector<TInventorySources> inventories, EOutputFormat format) const;
+    /// inventory has; for the majority, also if there are fewer than three inventories or one has its label.
+    std::vector<TInventorySources> Apply(std::vector<TInventorySources> inventories) const;
 };
 
 }  // namespace NORVZEL20
