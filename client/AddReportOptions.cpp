@@ -6,8 +6,11 @@ void AddReportOptions(CLI::App* command, TTextOptions& text)
 {
     CLI::Option* const detail =
         command->add_flag("--detail", text.isDetailed, "show each difference on its own, and all of the coverage");
+    // The text is what help shows in place of the options that each excludes.
+    detail->option_text(" ");
     command->add_flag("--summary", text.isSummary, "show who differs and how much in each class, without the findings")
-        ->excludes(detail);
+        ->excludes(detail)
+        ->option_text(" ");
     command->add_flag("--coverage", text.hasWholeCoverage, "show all of what was compared and what not");
     command->add_flag("--full", text.hasWholeKeys, "show keys and values whole, however long they are");
     command

@@ -20,9 +20,37 @@ TEST_F(ExecutableTest, ResultsGoToStandardOutputAlone)
 
 TEST_F(ExecutableTest, TroubleGoesToStandardErrorAlone)
 {
-    EXPECT_EQ("[2]\n--\ncimdelta: none.xml: cannot be opened: No such file or directory\n", Shell("compare --detail web01.xml none.xml"));
+    EXPECT_EQ("[2]\n--\ncimdelta: none.xml: cannot be opened: No such file or directory\n",
+              Shell("compare --detail web01.xml none.xml"));
     EXPECT_EQ("[2]\n--\ncimdelta: frob is no command; name one: compare, check, explain, query or show; see cimdelta --help\n",
               Shell("frob"));
+}
+
+TEST_F(ExecutableTest, TheEnvironmentDecidesOnColoursInAPipe)
+{
+    const auto isColored = [this](const std::string& environment, const std::string& options) {
+        return Shell("compare " + options + " web01.xml web02.xml", environment).find("\x1b[") != std::string::npos;
+    };
+    EXPECT_FALSE(isColored("", ""));
+    EXPECT_TRUE(isColored("CLICOLOR_FORCE=1 ", ""));
+    EXPECT_FALSE(isColored("CLICOLOR_FORCE=0 ", ""));
+    EXPECT_FALSE(isColored("CLICOLOR_FORCE= ", ""));
+    EXPECT_FALSE(isColored("CLICOLOR_FORCE=1 NO_COLOR=1 ", ""));
+    EXPECT_TRUE(isColored("NO_COLOR=1 ", "--color always"));
+    EXPECT_FALSE(isColored("CLICOLOR_FORCE=1 ", "--color never"));
+}
+
+TEST_F(ExecutableTest, ColumnsIsTheWidthOfAPipe)
+{
+    const auto hasWhole = [this](const std::string& environment) {
+        const std::string report = Shell("compare --summary web01.xml front-end-of-shop=web02.xml back-end=web03.xml", environment);
+        return report.find("    8  front-end-of-shop        5  back-end\n") != std::string::npos;
+    };
+    EXPECT_TRUE(hasWhole(""));
+    EXPECT_FALSE(hasWhole("COLUMNS=40 "));
+    for (const char* const unclear : {"0", "", "40x", "-1", "99999999999999999999999"}) {
+        EXPECT_TRUE(hasWhole("COLUMNS=" + std::string(unclear) + " ")) << unclear;
+    }
 }
 
 TEST_F(ExecutableTest, MessagesMoveNoTerminal)

@@ -97,21 +97,31 @@ TEST_F(TerminalOptionsTest, AnotherChoiceOfColourIsRefused)
               Complaint({"compare", "--color", "blue", "web01.xml", "web02.xml"}));
 }
 
-TEST_F(TerminalOptionsTest, ContentsAreCutAtTheWidthOfTheTerminal)
+TEST_F(TerminalOptionsTest, LinesAreAsWideAsTheTerminal)
 {
-    fWidth = 40;
-    EXPECT_NE(std::string::npos, Result({"compare", "web01.xml", "web02.xml"}).find("telnet     Version 0.17, Section net, ...\n"));
-    fWidth = 0;
-    EXPECT_NE(std::string::npos,
-              Result({"compare", "web01.xml", "web02.xml"}).find("telnet     Version 0.17, Section net, Size 7\n"));
+    const std::vector<std::string> arguments{"compare", "--summary", "web01.xml", "front-end=web02.xml", "back-end=web03.xml"};
+    EXPECT_NE(std::string::npos, Result(arguments).find("    8  front-end        5  back-end\n"));
+    for (const std::size_t narrow : std::vector<std::size_t>{30, 40}) {
+        fWidth = narrow;
+        EXPECT_NE(std::string::npos, Result(arguments).find("    8  front-end        5  back-end\n")) << "40 is the least";
+    }
+}
+
+TEST_F(TerminalOptionsTest, WhatIsTooWideGetsALineOfItsOwn)
+{
+    const std::vector<std::string> arguments{"compare", "--summary", "web01.xml", "front-end-of-shop=web02.xml",
+                                             "back-end=web03.xml"};
+    EXPECT_NE(std::string::npos, Result(arguments).find("    8  front-end-of-shop        5  back-end\n"));
+    fWidth = 42;
+    EXPECT_NE(std::string::npos, Result(arguments).find("    8  front-end-of-shop\n    5  back-end\n"));
 }
 
 TEST_F(TerminalOptionsTest, AFileHasItsOwnWidth)
 {
-    fWidth = 40;
+    fWidth = 42;
     const std::string path = Scratch("report.txt", "");
-    Result({"compare", "--output", path, "web01.xml", "web02.xml"});
-    EXPECT_NE(std::string::npos, ReadFile(path).find("telnet     Version 0.17, Section net, Size 7\n"));
+    Result({"compare", "--output", path, "web01.xml", "front-end-of-shop=web02.xml", "back-end=web03.xml"});
+    EXPECT_NE(std::string::npos, ReadFile(path).find("    8  front-end-of-shop        5  back-end\n"));
 }
 
 }  // namespace
