@@ -31,6 +31,7 @@
 #include <vector>
 
 #include "client/findings/CollectFindings.h"
+#include "client/report/BaselineText.h"
 #include "client/report/MarkdownText.h"
 #include "client/report/ShortCoverage.h"
 #include "client/report/TClassLines.h"
@@ -61,6 +62,7 @@ class TMarkdown {
         for (const TClassFindings& findings : fFindings.classes) {
             sink(Class(findings));
         }
+        sink(Baseline());
         sink(Coverage());
     }
 
@@ -119,6 +121,13 @@ class TMarkdown {
     }
 
     static void EndParagraph(std::string& text) { text += boost::algorithm::ends_with(text, "\n\n") ? "" : "\n"; }
+
+    // As code, since its lines are those of the file.
+    std::string Baseline() const
+    {
+        const std::string text = WriteBaselineText(fReport, fOptions);
+        return text.empty() ? text : MarkdownBlock(text.substr(1)) + "\n";
+    }
 
     std::string Coverage() const
     {

@@ -287,7 +287,7 @@ TEST_F(BaselineTest, JsonHasWhatIsGoneAndWhatChanged)
               "\"gone\":[{\"kind\":\"onlyInOthers\",\"instance\":\"Disk.Id=\\\"sdc\\\"\",\"inventories\":[\"web02\"],"
               "\"values\":[{\"property\":\"Size\",\"other\":\"uint16 7\"}],\"reason\":\"tested\"}],"
               "\"notCompared\":[],\"otherInventories\":[],\"entriesOfOtherInventories\":0}",
-              json.substr(begin, json.find(",\"classes\":[") - begin));
+              json.substr(begin, json.find(",\"classes\":[", begin) - begin));
 }
 
 TEST_F(BaselineTest, AFileThatCannotBeReadOrWrittenIsRefusedBeforeAnythingElse)
