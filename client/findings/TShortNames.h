@@ -18,7 +18,9 @@ namespace NORVZEL20 {
 class TShortNames {
   public:
     /// The inventories must outlive this. With `areWhole`, no key is left out: the names are as by TDifference::GetKeyText.
-    TShortNames(const std::vector<TInventory>& inventories, bool areWhole) : fInventories(inventories), fAreWhole(areWhole) {}
+    explicit TShortNames(const std::vector<TInventory>& inventories, bool areWhole = false)
+        : fInventories(inventories), fAreWhole(areWhole)
+    {}
 
     /// The name of the instance of a difference: `eth0` if one key is left and is text, otherwise `Bus=1,Unit=2`. In brackets what
     /// there is to say of an instance without a key. Cost: for a new class, that of a TDistinctKeys.
