@@ -4,6 +4,18 @@ function setText(overview, set) {
     return overview.sets[set].text;
 }
 
+// Which inventories a finding is about. Of two, a change concerns both.
+function whoText(overview, kind, set) {
+    const isPair = overview.inventories.length === 2;
+    if (kind === kChanged) {
+        return isPair ? "" : setText(overview, set);
+    }
+    if (isPair) {
+        return `only in ${overview.inventories[kind === kOnlyInReference ? overview.reference : overview.sets[set].inventories[0]].label}`;
+    }
+    return `${kind === kOnlyInReference ? "missing in" : "only in"} ${setText(overview, set)}`;
+}
+
 // `change` is { reference, short, groups: [{ value, set }] }.
 function changeNodes(overview, change, query) {
     const line = element("span", { class: "change" });

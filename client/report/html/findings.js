@@ -83,7 +83,7 @@ class Findings {
             element("span", { class: `kind ${kind.css}` }, element("span", { "aria-hidden": "true" }, kind.sign),
                 element("span", { class: "sr" }, `${kind.name}: `)),
             name, this.summaryOf(choice),
-            element("span", { class: "who" }, this.overview.inventories.length > 2 ? setText(this.overview, finding.set) : ""),
+            element("span", { class: "who" }, whoText(this.overview, finding.kind, finding.set)),
             element("span", { class: "count" }, formatted(choice.count),
                 element("span", { class: "of" }, choice.count < finding.rows ? ` of ${formatted(finding.rows)}` : ""),
                 element("span", { class: "sr" }, choice.count === 1 ? " instance" : " instances")));
@@ -97,12 +97,11 @@ class Findings {
         const names = element("span", { class: "names" }, marked(example.names.join(", "), this.query));
         const more = choice.count > example.names.length ? ` … ${formatted(choice.count - example.names.length)} more` : "";
         if (finding.kind !== kChanged) {
-            summary.append(names, more);
-            if (choice.count === 1) {
-                summary.append("  ", contentNodes(example.contents, this.query));
-            }
+            summary.append(names, more, choice.count === 1 ? contentNodes(example.contents, this.query) : "");
+        } else if (choice.count === 1) {
+            summary.append(names, ": ", changeNodes(this.overview, example.change, this.query));
         } else if (finding.changes === 1) {
-            summary.append(changeNodes(this.overview, example.change, this.query), "  ", names, more);
+            summary.append(changeNodes(this.overview, example.change, this.query), names, more);
         } else {
             summary.append(element("span", { class: "label" }, `${counted(finding.changes, "distinct change")}, as `),
                 marked(example.names[0], this.query), ": ", changeNodes(this.overview, example.change, this.query));
@@ -129,8 +128,10 @@ class Findings {
         if (finding.kind === kChanged) {
             facts.push(counted(finding.changes, "distinct change"));
         }
-        facts.push(`${finding.kind === kOnlyInReference ? "missing in" : finding.kind === kOnlyInOthers ? "only in" : "differs in"} ` +
-            setText(this.overview, finding.set));
+        const who = whoText(this.overview, finding.kind, finding.set);
+        if (who) {
+            facts.push(who);
+        }
         const tools = element("div", { class: "tools" }, element("p", {}, facts.join(" · ")),
             element("button", { type: "button", class: "rule-button", "aria-expanded": String(isOpen), "data-finding": finding.first },
                 "Rule to leave this out"));
@@ -152,8 +153,7 @@ class Findings {
         return element("div", { class: "item row" },
             element("button", { type: "button", class: "line", "aria-expanded": String(this.openRows.has(row)) },
                 element("span", { class: "mark", "aria-hidden": "true" }),
-                element("span", { class: "name" }, marked(cut(name), this.query)), said,
-                element("span", { class: "who" }, this.overview.inventories.length > 2 ? setText(this.overview, rows.rowSet[row]) : "")));
+                element("span", { class: "name" }, marked(cut(name), this.query)), said));
     }
 
     click(event) {
@@ -195,7 +195,10 @@ class Findings {
             }
         }
         this.list.setActive(key);
-        this.list.elements.get(key).querySelector(".line").setAttribute("aria-expanded", String(open.has(number)));
+        const drawn = this.list.elements.get(key);
+        if (drawn) {
+            drawn.querySelector(".line").setAttribute("aria-expanded", String(open.has(number)));
+        }
         this.update(true);
     }
 
@@ -230,7 +233,7 @@ async function copyRule(button) {
         isCopied = copySelected(button.parentNode.querySelector("pre"));
     }
     button.textContent = isCopied ? "Copied" : "Select the text and copy it";
-    announce(isCopied ? "The rule is copied." : "The rule cannot be copied here; select the text and copy it.");
+    byId("said").textContent = (isCopied ? "The rule is copied." : "The rule cannot be copied here; select the text and copy it.");
 }
 
 // Browsers give a page from a file no clipboard, but they copy what is selected.

@@ -158,8 +158,8 @@ class WindowedList {
         let changed = false;
         for (const [key, made] of this.elements) {
             const i = this.places.get(key);
-            const height = made.offsetHeight;
-            if (Math.abs(height - this.heights[i]) > 0.5) {
+            const { height } = made.getBoundingClientRect();
+            if (Math.abs(height - this.heights[i]) > 0.01) {
                 this.heights[i] = height;
                 changed = true;
             }
@@ -171,7 +171,7 @@ class WindowedList {
     // All lines have changed their heights, as after the window was made narrower.
     forgetHeights() {
         for (const [key, made] of this.elements) {
-            this.usual[this.items[this.places.get(key)].type] = made.offsetHeight;
+            this.usual[this.items[this.places.get(key)].type] = made.getBoundingClientRect().height;
         }
         this.heights = Float32Array.from(this.items, (item) => this.usual[item.type]);
         this.layOut();

@@ -1,14 +1,17 @@
 // The parts of the page that do not change: verdict, counts, the table of classes, inventories, rules and coverage.
 
-// Tables begin with so many lines and columns; a button adds the rest.
+// The table begins with so many lines and columns; a button adds the rest. Inventories without differences are shown only if there
+// are few.
 const kFirstClasses = 24;
 const kFirstInventories = 48;
+const kFewInventories = 12;
 
 function drawHead(overview) {
     document.title = overview.verdict;
     byId("verdict").textContent = overview.verdict;
     const { counts } = overview;
     const isPair = overview.inventories.length === 2;
+    document.documentElement.classList.toggle("pair", isPair);
     const [reference, other] = overview.inventories.map((inventory) => inventory.label);
     const lines = [
         ["minus", "−", counts.onlyInReference, isPair ? `only in ${reference}` : `in ${reference}, missing elsewhere`],
@@ -35,7 +38,9 @@ class Matrix {
         this.root = root;
         this.choose = choose;
         this.mostClasses = kFirstClasses;
-        this.mostInventories = kFirstInventories;
+        const differing = overview.inventories.filter((inventory) => inventory.differences > 0).length;
+        this.mostInventories = overview.inventories.length <= kFewInventories + 1 ? kFewInventories
+            : Math.min(kFirstInventories, Math.max(1, differing));
         this.draw();
         root.addEventListener("click", (event) => this.click(event));
         root.addEventListener("keydown", (event) => this.key(event));
