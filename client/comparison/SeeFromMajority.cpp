@@ -4,6 +4,7 @@
 #include <utility>
 
 #include "client/comparison/TMajorityView.h"
+#include "client/inventory/TReferenceChoice.h"
 
 namespace NORVZEL20 {
 

@@ -4,9 +4,6 @@
 
 namespace NORVZEL20 {
 
-/// What stands for the majority among labels.
-inline constexpr char kMajorityLabel[] = "majority";
-
 /// The report with the majority as its reference; see TMajorityView. All positions in it are those of the view; the majority was
 /// loaded from no file, and nothing of it was compared. `report` is that of a run, as TComparison returns it, with all differences.
 /// Errors: those of IDifferences::ForEach.

@@ -1,8 +1,7 @@
-#include "client/commands/TReferenceChoice.h"
+#include "client/inventory/TReferenceChoice.h"
 
 #include <algorithm>
 
-#include "client/comparison/SeeFromMajority.h"
 #include "client/inventory/InventoryLabels.h"
 #include "client/process/TClientError.h"
 #include "client/text/DisplayText.h"
