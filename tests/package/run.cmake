@@ -39,6 +39,7 @@ run(${CMAKE_COMMAND} --build ${WORK_DIR}/build)
 run_user(result)
 expect("${result}" "0: delta: 2 containers, data in ${package}/share/cimdelta\n")
 run(${package}/bin/cimdelta --version)
+run(${CMAKE_COMMAND} -E compare_files ${SOURCE_DIR}/data/schema/comparison-1.json ${package}/share/cimdelta/schema/comparison-1.json)
 
 # The package's data and no other: without them the program fails, and the environment may name others.
 file(RENAME ${package}/share/cimdelta ${WORK_DIR}/elsewhere)
