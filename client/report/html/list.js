@@ -1,10 +1,12 @@
 // A list of lines of which only those in the window are in the document. Lines have keys; an element stays as long as its line is in
-// view. Heights are measured when a line is drawn; until then a line is as high as the last one of its type.
+// view. Heights are measured when a line is drawn; until then a line is as high as the last one of its type that was measured.
 //
 // Browsers limit the height of an element. A longer list is drawn in one of the greatest height, and scrolls faster.
 
 const kGreatestHeight = 12000000;
 const kBeyondView = 400;
+// All lines of such a type are of one height.
+const kAlikeTypes = new Set(["finding", "row"]);
 
 class WindowedList {
     // `draw(item)` makes the element of an item { key, type, level }.
@@ -12,12 +14,22 @@ class WindowedList {
         this.root = root;
         this.draw = draw;
         this.items = [];
+        this.measured = new Uint8Array(0);
         this.elements = new Map();
         this.usual = { finding: 36, row: 30, tools: 44, values: 160 };
         this.activeKey = "";
         this.isPrinting = false;
         window.addEventListener("scroll", () => this.schedule(), { passive: true });
-        new ResizeObserver(() => this.schedule()).observe(root);
+        new ResizeObserver(() => this.resize()).observe(root);
+    }
+
+    // Other widths make other heights.
+    resize() {
+        if (this.root.clientWidth !== this.width) {
+            this.width = this.root.clientWidth;
+            this.measured.fill(0);
+            this.schedule();
+        }
     }
 
     schedule() {
@@ -39,11 +51,12 @@ class WindowedList {
             this.elements.clear();
         }
         const heights = new Map();
-        if (this.heights && keeps) {
-            this.items.forEach((item, i) => heights.set(item.key, this.heights[i]));
+        if (keeps) {
+            this.items.forEach((item, i) => this.measured[i] && heights.set(item.key, this.heights[i]));
         }
         this.items = items;
-        this.heights = Float32Array.from(items, (item) => heights.get(item.key) || this.usual[item.type]);
+        this.measured = Uint8Array.from(items, (item) => (heights.has(item.key) ? 1 : 0));
+        this.heights = Float64Array.from(items, (item) => heights.get(item.key) || this.usual[item.type]);
         this.places = new Map(items.map((item, i) => [item.key, i]));
         if (!this.places.has(this.activeKey)) {
             this.activeKey = items.length > 0 ? items[0].key : "";
@@ -155,27 +168,32 @@ class WindowedList {
 
     // Whether any line in the document is not as high as assumed.
     measure() {
+        const types = new Set();
         let changed = false;
         for (const [key, made] of this.elements) {
             const i = this.places.get(key);
+            const { type } = this.items[i];
             const { height } = made.getBoundingClientRect();
-            if (Math.abs(height - this.heights[i]) > 0.01) {
-                this.heights[i] = height;
-                changed = true;
+            changed = changed || Math.abs(height - this.heights[i]) > 0.01;
+            if (Math.abs(height - this.usual[type]) > 0.01 && kAlikeTypes.has(type)) {
+                types.add(type);
             }
-            this.usual[this.items[i].type] = height;
+            this.heights[i] = this.usual[type] = height;
+            this.measured[i] = 1;
         }
-        return changed;
+        if (types.size > 0) {
+            this.assume(types);
+        }
+        return changed || types.size > 0;
     }
 
-    // All lines have changed their heights, as after the window was made narrower.
-    forgetHeights() {
-        for (const [key, made] of this.elements) {
-            this.usual[this.items[this.places.get(key)].type] = made.getBoundingClientRect().height;
-        }
-        this.heights = Float32Array.from(this.items, (item) => this.usual[item.type]);
-        this.layOut();
-        this.render();
+    // Lines of these types that were never drawn are as high as those that were.
+    assume(types) {
+        this.items.forEach((item, i) => {
+            if (this.measured[i] === 0 && types.has(item.type)) {
+                this.heights[i] = this.usual[item.type];
+            }
+        });
     }
 
     markActive(made, isActive) {
@@ -197,16 +215,18 @@ class WindowedList {
         }
     }
 
-    // Brings the line into view and gives it the focus. `inset` is covered at the top of the window.
+    // Brings the line into view and gives it the focus. `inset` is covered at the top of the window. Lines that are drawn on the way
+    // may turn out to have other heights, so the place is looked at again.
     focus(key, inset) {
-        const i = this.places.get(key);
         this.setActive(key);
-        const top = this.viewTop() + inset + Math.min(0, -this.root.getBoundingClientRect().top);
-        const bottom = this.viewTop() + window.innerHeight - Math.max(0, this.root.getBoundingClientRect().top);
-        if (this.starts[i] < top) {
-            window.scrollBy(0, (this.starts[i] - top - 8) / this.ratio());
-        } else if (this.starts[i + 1] > bottom) {
-            window.scrollBy(0, (this.starts[i + 1] - bottom + 8) / this.ratio());
+        for (let pass = 0; pass < 3; ++pass) {
+            this.render();
+            const box = this.elements.get(key).getBoundingClientRect();
+            if (box.top < inset) {
+                window.scrollBy(0, (box.top - inset - 8) / this.ratio());
+            } else if (box.bottom > window.innerHeight) {
+                window.scrollBy(0, (box.bottom - window.innerHeight + 8) / this.ratio());
+            }
         }
         this.render();
         this.elements.get(key).querySelector(".line").focus({ preventScroll: true });
