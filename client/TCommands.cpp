@@ -4,6 +4,7 @@
 #include <memory>
 
 #include "client/AddBaseline.h"
+#include "client/AddCollectOptions.h"
 #include "client/AddLoadingOptions.h"
 #include "client/AddReferenceOptions.h"
 #include "client/AddReportOptions.h"
@@ -100,6 +101,7 @@ TCommands::TCommands(CLI::App& app) : fApp(app)
     AddExplain();
     AddQuery();
     AddShow();
+    AddCollect();
 }
 
 CLI::App* TCommands::AddCommand(const char* name, const char* description, std::function<int(IConsole&)> run)
@@ -194,6 +196,15 @@ void TCommands::AddShow()
     AddFormat(command, fShow.format, ListingFormatNames());
     AddLoadingOptions(command, fShow.loading, kSchemaNames);
     AddOutput(command, fShow.output);
+}
+
+void TCommands::AddCollect()
+{
+    CLI::App* command = AddCommand("collect", "write an inventory of this Linux system", [this](IConsole& console) {
+        CheckCollect(fCollect);
+        return RunCollect(fCollect, console);
+    });
+    AddCollectOptions(command, fCollect);
 }
 
 }  // namespace NORVZEL20

@@ -4,6 +4,7 @@
 #include <functional>
 
 #include "client/commands/CheckCommand.h"
+#include "client/commands/CollectCommand.h"
 #include "client/commands/CompareCommand.h"
 #include "client/commands/ExplainCommand.h"
 #include "client/commands/QueryCommand.h"
@@ -29,6 +30,7 @@ class TCommands {
     CLI::App* AddCommand(const char* name, const char* description, std::function<int(IConsole&)> run);
     void AddCompare();
     void AddCheck();
+    void AddCollect();
     void AddExplain();
     void AddQuery();
     void AddShow();
@@ -39,6 +41,7 @@ class TCommands {
     std::vector<std::string> fOthers;  // likewise: the other inventories of compare, and those of the other commands
     TCompareOptions fCompare;
     TCheckOptions fCheck;
+    TCollectOptions fCollect;
     TExplainOptions fExplain;
     TQueryOptions fQuery;
     TShowOptions fShow;

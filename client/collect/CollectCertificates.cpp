@@ -1,0 +1,54 @@
+// Certificates in files of the system's folders. A link is not followed: what it leads to is in one of the folders too, or in a
+// file that holds all authorities of the system.
+#include <algorithm>
+#include <array>
+
+#include "client/collect/CollectKinds.h"
+#include "client/collect/HoldsSecrets.h"
+#include "client/collect/TFileWalk.h"
+#include "client/collect/read/ReadCertificates.h"
+#include "client/collect/read/TextPieces.h"
+
+namespace NORVZEL20 {
+
+namespace {
+
+constexpr std::array<const char*, 3> kCertificateFolders = {"/etc", "/usr/local/etc", "/usr/local/share/ca-certificates"};
+constexpr std::array<const char*, 5> kCertificateSuffixes = {".pem", ".crt", ".cer", ".cert", ".der"};
+constexpr std::size_t kMostCertificateFileBytes = 16U << 20U;
+
+bool MayHoldCertificates(const std::string& path)
+{
+    return !HoldsSecrets(path) && std::any_of(kCertificateSuffixes.begin(), kCertificateSuffixes.end(),
+                                              [&path](const char* suffix) { return EndsWith(path, suffix); });
+}
+
+bool AddCertificates(TCollection& collection, const std::string& path, const struct stat& status)
+{
+    if (!S_ISREG(status.st_mode) || !MayHoldCertificates(path)) {
+        return true;
+    }
+    const TFileText file = collection.GetRoot().Read(path, kMostCertificateFileBytes);
+    if (!file.trouble.empty()) {
+        collection.LeaveOut(path, file.trouble);
+        return true;
+    }
+    TReadFaults faults;
+    collection.AddAll(ReadCertificates(file.text, path, faults));
+    collection.LeaveOutLines(path, faults);
+    return true;
+}
+
+}  // namespace
+
+void CollectCertificates(TCollection& collection)
+{
+    TFileWalk walk(
+        collection, [](const std::string&) { return true; },
+        [&collection](const std::string& path, const struct stat& status) { return AddCertificates(collection, path, status); });
+    for (const char* const folder : kCertificateFolders) {
+        walk.Walk(folder);
+    }
+}
+
+}  // namespace NORVZEL20

@@ -1,0 +1,175 @@
+// Configuration files: their digests, owners and permissions.
+//
+// Whether the contents are read depends on the permissions and the name, not on who collects, so the inventories of root and of
+// another user meet: a file that not everybody may read has a digest only if --root-files asked for it, and one for keys or
+// passwords never has one. Who owns them, and with which permissions, is in the inventory all the same.
+#include <fnmatch.h>
+
+#include <algorithm>
+#include <array>
+#include <map>
+
+#include "client/collect/CollectKinds.h"
+#include "client/collect/DigestFile.h"
+#include "client/collect/HoldsSecrets.h"
+#include "client/collect/TFileWalk.h"
+#include "client/collect/read/ReadAccounts.h"
+
+namespace NORVZEL20 {
+
+namespace {
+
+constexpr std::array<const char*, 2> kConfigurationFolders = {"/etc", "/usr/local/etc"};
+
+// What programs write by themselves, and what editors and package managers leave behind.
+constexpr const char* kNoConfiguration[] = {
+    "*~",
+    "*.swp",
+    "*/.git",
+    "/etc/*.dpkg-new",
+    "/etc/*.dpkg-tmp",
+    "/etc/.pwd.lock",
+    "/etc/.updated",
+    "/etc/adjtime",
+    "/etc/aliases.db",
+    "/etc/blkid*",
+    "/etc/cups/subscriptions.conf*",
+    "/etc/fake-hwclock.data",
+    "/etc/group-",
+    "/etc/ld.so.cache",
+    "/etc/lvm/archive",
+    "/etc/lvm/backup",
+    "/etc/lvm/cache",
+    "/etc/machine-id",
+    "/etc/mtab",
+    "/etc/passwd-",
+    "/etc/printcap",
+    "/etc/random-seed",
+    "/etc/subgid-",
+    "/etc/subuid-",
+    "/etc/udev/hwdb.bin",
+};
+
+std::string TypeOf(mode_t mode)
+{
+    switch (mode & S_IFMT) {
+    case S_IFREG:
+        return "file";
+    case S_IFDIR:
+        return "folder";
+    case S_IFLNK:
+        return "link";
+    case S_IFIFO:
+        return "fifo";
+    case S_IFSOCK:
+        return "socket";
+    default:
+        return "device";
+    }
+}
+
+std::string ModeText(mode_t mode)
+{
+    std::string text;
+    for (const unsigned int shift : {9U, 6U, 3U, 0U}) {
+        text += static_cast<char>('0' + (mode >> shift & 7U));
+    }
+    return text;
+}
+
+class TConfigurationFiles {
+  public:
+    explicit TConfigurationFiles(TCollection& collection)
+        : fCollection(collection), fUsers(NamesByNumber("/etc/passwd", &ReadUsers, "UserID")),
+          fGroups(NamesByNumber("/etc/group", &ReadGroups, "GroupID"))
+    {}
+
+    bool IsWanted(const std::string& path) const
+    {
+        const auto matches = [&path](const std::string& pattern) { return fnmatch(pattern.c_str(), path.c_str(), 0) == 0; };
+        const std::vector<std::string>& excluded = fCollection.GetOptions().excluded;
+        return std::none_of(std::begin(kNoConfiguration), std::end(kNoConfiguration), matches) &&
+               std::none_of(excluded.begin(), excluded.end(), matches);
+    }
+
+    bool Visit(const std::string& path, const struct stat& status)
+    {
+        TFacts facts("KALMO_ConfigurationFile");
+        facts.Key("Name", path)
+            .Text("Type", TypeOf(status.st_mode))
+            .Text("Owner", NameOf(fUsers, status.st_uid))
+            .Text("Group", NameOf(fGroups, status.st_gid));
+        if (S_ISLNK(status.st_mode)) {
+            facts.Text("LinkTarget", fCollection.GetRoot().ReadLink(path).value_or(std::string()));
+        } else {
+            facts.Text("Mode", ModeText(status.st_mode));
+        }
+        if (S_ISREG(status.st_mode)) {
+            AddContents(facts, path, status);
+        }
+        fCollection.Add(facts);
+        const mode_t needed = S_IROTH | S_IXOTH;
+        if (S_ISDIR(status.st_mode) && (status.st_mode & needed) != needed && !fCollection.GetOptions().hasRootFiles) {
+            fCollection.LeaveOut(path, kForRoot);
+            return false;
+        }
+        return true;
+    }
+
+  private:
+    using TNames = std::map<std::string, std::string>;
+    static constexpr char kForRoot[] = "only root may read it";
+
+    TNames NamesByNumber(const std::string& path, TCollection::TReader reader, const char* number) const
+    {
+        TNames names;
+        TReadFaults ignored;  // reported with the users
+        for (const TFacts& facts : reader(fCollection.GetRoot().Read(path).text, ignored)) {
+            names.emplace(facts.Find(number).ToText(), facts.Find("Name").ToText());
+        }
+        return names;
+    }
+
+    static std::string NameOf(const TNames& names, unsigned int number)
+    {
+        const auto found = names.find(std::to_string(number));
+        return found == names.end() ? std::to_string(number) : found->second;
+    }
+
+    void AddContents(TFacts& facts, const std::string& path, const struct stat& status)
+    {
+        if (path == "/etc/passwd" || path == "/etc/group") {
+            return;  // the users and groups are instances of their own
+        }
+        std::string trouble;
+        if (HoldsSecrets(path)) {
+            trouble = kSecretReason;
+        } else if ((status.st_mode & S_IROTH) == 0 && !fCollection.GetOptions().hasRootFiles) {
+            trouble = kForRoot;
+        } else if (const std::string digest = DigestFile(fCollection.GetRoot(), path, trouble); !digest.empty()) {
+            facts.Text("Digest", digest);
+        }
+        if (!trouble.empty()) {
+            fCollection.LeaveOut(path, trouble);
+        }
+    }
+
+    TCollection& fCollection;
+    TNames fUsers;
+    TNames fGroups;
+};
+
+}  // namespace
+
+void CollectFiles(TCollection& collection)
+{
+    TConfigurationFiles files(collection);
+    TFileWalk walk(
+        collection, [&files](const std::string& path) { return files.IsWanted(path); },
+        [&files](const std::string& path, const struct stat& status) { return files.Visit(path, status); });
+    for (const char* const folder : kConfigurationFolders) {
+        walk.Walk(folder);
+    }
+}
+
+}  // namespace NORVZEL20

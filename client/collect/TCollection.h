@@ -1,0 +1,71 @@
+#pragma once
+
+#include <cstddef>
+#include <optional>
+#include <string>
+#include <vector>
+
+#include "client/collect/ISystemCalls.h"
+#include "client/collect/TCollectionOptions.h"
+#include "client/collect/TInventoryWriter.h"
+#include "client/collect/TOmissions.h"
+#include "client/collect/TSystemRoot.h"
+#include "client/collect/read/TFacts.h"
+#include "client/collect/read/TReadFaults.h"
+
+namespace NORVZEL20 {
+
+/// One collection on its way: where facts come from, and where they go. The functions of CollectKinds.h share it.
+class TCollection {
+  public:
+    using TReader = std::vector<TFacts> (*)(std::string_view text, TReadFaults& faults);
+
+    /// What Add throws when the time is up. It ends the collection of all kinds.
+    struct TTimeIsUp {};
+
+    /// All must outlive this.
+    TCollection(const TSystemRoot& root, ISystemCalls& calls, const TCollectionOptions& options, TInventoryWriter& writer);
+
+    const TSystemRoot& GetRoot() const noexcept { return fRoot; }
+    ISystemCalls& GetCalls() const noexcept { return fCalls; }
+    const TCollectionOptions& GetOptions() const noexcept { return fOptions; }
+    const TOmissions& GetOmissions() const noexcept { return fOmissions; }
+
+    /// What is left out from now on belongs to this kind.
+    void BeginKind(const std::string& kind) { fKind = kind; }
+
+    /// Writes an instance. One with the keys of an earlier one is left out. Errors: TTimeIsUp; those of the writer.
+    void Add(const TFacts& facts);
+    void AddAll(const std::vector<TFacts>& all);
+
+    /// Notes that something of the current kind is not collected.
+    void LeaveOut(const std::string& subject, const std::string& reason);
+    /// Notes lines of a file that could not be taken.
+    void LeaveOutLines(const std::string& path, const TReadFaults& faults);
+
+    /// The text of a file. One that cannot be read is left out.
+    std::optional<std::string> Read(const std::string& path);
+    /// The same, except that the file need not be there.
+    std::optional<std::string> ReadIfThere(const std::string& path);
+    /// The first line of a file that need not be there, without blanks around it; empty if it cannot be read.
+    std::string ReadValue(const std::string& path) const;
+
+    /// Reads a file and writes what the reader makes of it.
+    void AddFrom(const std::string& path, TReader reader);
+
+    /// Errors: TTimeIsUp.
+    void CheckTime() const;
+
+  private:
+    std::optional<std::string> TextOf(TFileText file, const std::string& path);
+
+    const TSystemRoot& fRoot;
+    ISystemCalls& fCalls;
+    const TCollectionOptions& fOptions;
+    TInventoryWriter& fWriter;
+    TOmissions fOmissions;
+    std::string fKind;
+    std::chrono::steady_clock::time_point fEnd;
+};
+
+}  // namespace NORVZEL20

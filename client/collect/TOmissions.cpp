@@ -1,0 +1,54 @@
+#include "client/collect/TOmissions.h"
+
+namespace NORVZEL20 {
+
+void TOmissions::Add(const std::string& kind, const std::string& reason, const std::string& subject)
+{
+    TSubjects& subjects = fSubjects[{kind, reason}];
+    ++subjects.count;
+    if (subjects.named.size() < kMostSubjects) {
+        subjects.named.push_back(subject);
+    }
+}
+
+std::vector<TFacts> TOmissions::MakeFacts() const
+{
+    std::vector<TFacts> facts;
+    for (const auto& [key, subjects] : fSubjects) {
+        facts.push_back(TFacts("KALMO_NotCollected")
+                            .Key("Kind", key.first)
+                            .Key("Reason", key.second)
+                            .Number("Count", subjects.count)
+                            .Texts("Subjects", subjects.named));
+    }
+    return facts;
+}
+
+std::string TOmissions::Describe(const TSubjects& subjects)
+{
+    constexpr std::size_t kMost = 3;
+    std::string text;
+    const std::size_t shown = subjects.count <= kMost + 1 ? subjects.count : kMost;
+    for (std::size_t i = 0; i < shown; ++i) {
+        text += (i == 0 ? "" : ", ") + subjects.named[i];
+    }
+    return subjects.count == shown ? text : text + " and " + std::to_string(subjects.count - shown) + " others";
+}
+
+std::vector<std::string> TOmissions::MakeLines() const
+{
+    std::vector<std::string> lines;
+    std::string kind;
+    for (const auto& [key, subjects] : fSubjects) {
+        const std::string text = Describe(subjects) + ": " + key.second;
+        if (lines.empty() || key.first != kind) {
+            lines.push_back("not collected: " + key.first + ": " + text);
+        } else {
+            lines.back() += "; " + text;
+        }
+        kind = key.first;
+    }
+    return lines;
+}
+
+}  // namespace NORVZEL20

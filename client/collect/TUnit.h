@@ -1,0 +1,24 @@
+#pragma once
+
+#include <string>
+#include <vector>
+
+#include "client/collect/read/TUnitFile.h"
+
+namespace NORVZEL20 {
+
+/// A systemd unit, as far as its files say.
+struct TUnit {
+    TUnitFile file;
+    std::string path;   ///< of the file; empty if there is only a link to a template
+    std::string state;  ///< whether it is started with the system, in the words of UnitFileState
+    std::vector<std::string> dropIns;
+
+    /// The unit that this one starts if it is a timer or a path of that name.
+    std::string Activated(const std::string& name) const
+    {
+        return file.activated.empty() ? name.substr(0, name.rfind('.')) + ".service" : file.activated;
+    }
+};
+
+}  // namespace NORVZEL20

@@ -1,0 +1,195 @@
+// Which units there are, and whether they are started with the system.
+//
+// systemd looks for units in several folders; a file in an earlier one hides those of the same name. Links say the rest:
+//
+//   /etc/systemd/system/multi-user.target.wants/ssh.service    ssh.service is enabled
+//   /etc/systemd/system/sshd.service -> .../ssh.service        another name, and ssh.service is enabled
+//   /etc/systemd/system/cups.service -> /dev/null              cups.service is masked, as by an empty file
+//   /etc/systemd/system/ssh.service.d/port.conf                changes ssh.service
+//
+// Links in /run are enabled until the next start. A unit that is not enabled is disabled if its file says how it could be, and
+// static if not. An instance such as getty@tty1.service has the file of its template, getty@.service.
+#include "client/collect/TUnitFiles.h"
+
+#include <algorithm>
+#include <array>
+
+#include "client/collect/read/ReadUnitFile.h"
+#include "client/collect/read/TextPieces.h"
+
+namespace NORVZEL20 {
+
+namespace {
+
+constexpr std::array<const char*, 10> kUnitFolders = {
+    "/etc/systemd/system.control", "/run/systemd/transient",      "/run/systemd/generator.early",  "/etc/systemd/system",
+    "/run/systemd/system",         "/run/systemd/generator",      "/usr/local/lib/systemd/system", "/usr/lib/systemd/system",
+    "/lib/systemd/system",         "/run/systemd/generator.late",
+};
+
+constexpr std::array<const char*, 6> kUnitSuffixes = {".service", ".socket", ".timer", ".path", ".target", ".automount"};
+
+// What a unit is that has its file in this folder; empty if the folder does not decide.
+std::string StateOfFolder(const std::string& folder)
+{
+    if (folder == "/run/systemd/transient") {
+        return "transient";
+    }
+    return StartsWith(folder, "/run/systemd/generator") ? "generated" : std::string();
+}
+
+std::string StateInFolder(const std::string& folder, const std::string& state)
+{
+    return StartsWith(folder, "/run/") ? state + "-runtime" : state;
+}
+
+std::string NameOf(const std::string& path)
+{
+    return path.substr(path.rfind('/') + 1);
+}
+
+// getty@.service for getty@tty1.service; empty if it is no instance.
+std::string TemplateOf(const std::string& name)
+{
+    const std::size_t at = name.find('@');
+    const std::size_t dot = name.rfind('.');
+    return at == std::string::npos || dot == std::string::npos || dot <= at + 1 ? std::string()
+                                                                                : name.substr(0, at + 1) + name.substr(dot);
+}
+
+}  // namespace
+
+bool TUnitFiles::IsUnitName(const std::string& name)
+{
+    return std::any_of(kUnitSuffixes.begin(), kUnitSuffixes.end(),
+                       [&name](const char* suffix) { return EndsWith(name, suffix) && name != suffix; });
+}
+
+TUnitFiles::TUnitFiles(TCollection& collection) : fCollection(collection)
+{
+    for (const std::string folder : kUnitFolders) {
+        TakeFolder(folder);
+    }
+    AddEnabledInstances();
+    for (auto& [name, unit] : fUnits) {
+        FinishUnit(name, unit);
+    }
+}
+
+void TUnitFiles::TakeFolder(const std::string& folder)
+{
+    std::string trouble;
+    for (const TFolderEntry& entry : fCollection.GetRoot().List(folder, trouble)) {
+        const bool isFolder = entry.kind == TFolderEntry::EKind::kFolder;
+        if (isFolder && (EndsWith(entry.name, ".wants") || EndsWith(entry.name, ".requires") || EndsWith(entry.name, ".upholds"))) {
+            TakeEnabled(folder, entry.name);
+        } else if (isFolder && EndsWith(entry.name, ".d")) {
+            TakeDropIns(folder, entry.name);
+        } else if (!isFolder && IsUnitName(entry.name)) {
+            TakeUnit(folder, entry);
+        }
+    }
+    if (!trouble.empty()) {
+        fCollection.LeaveOut(folder, trouble);
+    }
+}
+
+void TUnitFiles::TakeUnit(const std::string& folder, const TFolderEntry& entry)
+{
+    fCollection.CheckTime();
+    if (fUnits.count(entry.name) > 0) {
+        return;
+    }
+    TUnit unit;
+    unit.path = folder + "/" + entry.name;
+    unit.state = StateOfFolder(folder);
+    if (entry.kind == TFolderEntry::EKind::kLink) {
+        TakeLink(folder, entry.name, unit);
+    } else {
+        TakeText(unit.path, unit);
+    }
+    fUnits.emplace(entry.name, std::move(unit));
+}
+
+void TUnitFiles::TakeLink(const std::string& folder, const std::string& name, TUnit& unit)
+{
+    const std::string target = fCollection.GetRoot().ReadLink(unit.path).value_or(std::string());
+    if (target == "/dev/null") {
+        unit.state = StateInFolder(folder, "masked");
+    } else if (NameOf(target) != name && TemplateOf(name) != NameOf(target)) {
+        unit.state = "alias";
+        if (StartsWith(folder, "/etc/")) {
+            fEnabled.emplace(NameOf(target), "enabled");
+        }
+    } else {
+        TakeText(unit.path, unit);
+    }
+}
+
+void TUnitFiles::TakeText(const std::string& path, TUnit& unit)
+{
+    const std::optional<std::string> text = fCollection.Read(path);
+    if (!text) {
+        return;
+    }
+    if (text->empty()) {
+        unit.state = StateInFolder(path, "masked");
+    }
+    ReadUnitFile(*text, unit.file);
+}
+
+void TUnitFiles::TakeEnabled(const std::string& folder, const std::string& subfolder)
+{
+    if (folder != "/etc/systemd/system" && folder != "/run/systemd/system") {
+        return;  // what a package links is static
+    }
+    for (const TFolderEntry& entry : fCollection.GetRoot().List(folder + "/" + subfolder)) {
+        if (IsUnitName(entry.name)) {
+            fEnabled.emplace(entry.name, StateInFolder(folder, "enabled"));
+        }
+    }
+}
+
+void TUnitFiles::TakeDropIns(const std::string& folder, const std::string& subfolder)
+{
+    const std::string unit = subfolder.substr(0, subfolder.size() - 2);
+    for (const TFolderEntry& entry : fCollection.GetRoot().List(folder + "/" + subfolder)) {
+        if (EndsWith(entry.name, ".conf")) {
+            fDropIns[unit].emplace(entry.name, folder + "/" + subfolder + "/" + entry.name);
+        }
+    }
+}
+
+void TUnitFiles::AddEnabledInstances()
+{
+    for (const auto& [name, state] : fEnabled) {
+        const auto pattern = fUnits.find(TemplateOf(name));
+        if (pattern != fUnits.end() && fUnits.count(name) == 0) {
+            const TUnit unit = pattern->second;
+            fUnits.emplace(name, unit);
+        }
+    }
+}
+
+void TUnitFiles::FinishUnit(const std::string& name, TUnit& unit)
+{
+    for (const auto& [file, path] : fDropIns[name]) {
+        unit.dropIns.push_back(path);
+        if (const std::optional<std::string> text = fCollection.ReadIfThere(path)) {
+            ReadUnitFile(*text, unit.file);
+        }
+    }
+    if (!unit.state.empty()) {
+        return;
+    }
+    const auto enabled = fEnabled.find(name);
+    if (enabled != fEnabled.end()) {
+        unit.state = enabled->second;
+    } else if (unit.file.isInstalled) {
+        unit.state = "disabled";
+    } else {
+        unit.state = unit.file.isInstalledByOthers ? "indirect" : "static";
+    }
+}
+
+}  // namespace NORVZEL20

@@ -1,0 +1,18 @@
+#pragma once
+
+#include <string>
+#include <vector>
+
+namespace NORVZEL20 {
+
+/// What the file of a systemd unit says, as far as an inventory needs it.
+struct TUnitFile {
+    std::string description;
+    std::string type;                    ///< of a service: simple, oneshot, dbus ...
+    std::string activated;               ///< the unit that a timer or path starts, if the file names one
+    std::vector<std::string> schedules;  ///< of a timer: OnCalendar=daily
+    bool isInstalled = false;            ///< the file says by which units it may be enabled
+    bool isInstalledByOthers = false;    ///< the file names others that are enabled in its place
+};
+
+}  // namespace NORVZEL20

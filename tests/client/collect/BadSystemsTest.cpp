@@ -1,0 +1,157 @@
+#include <gtest/gtest.h>
+#include <sys/stat.h>
+
+#include "client/collect/read/TextPieces.h"
+#include "tests/client/collect/TCollectFixture.h"
+
+namespace NORVZEL20 {
+
+class BadSystemsTest : public TCollectFixture {
+  protected:
+    /// The lines of the next collection that are about that kind.
+    std::string LinesAbout(const std::string& kind, const TCollectionOptions& options = TCollectionOptions())
+    {
+        fSystem->CollectTo("x.xml", options);
+        std::string lines;
+        for (const std::string& line : ListOf(fSystem->GetLines(), '\n')) {
+            if (StartsWith(line, "not collected: " + kind + ": ")) {
+                lines += line.substr(15 + kind.size() + 2) + "\n";
+            }
+        }
+        return lines;
+    }
+};
+
+TEST_F(BadSystemsTest, SystemThatCanBeReadLacksNothingButWhatIsNeverRead)
+{
+    EXPECT_EQ("/etc/shadow: it may hold keys or passwords\n", LinesAbout("files"));
+    EXPECT_EQ("not collected: files: /etc/shadow: it may hold keys or passwords\n", fSystem->GetLines());
+}
+
+TEST_F(BadSystemsTest, WhatIsLeftOutIsInTheInventory)
+{
+    EXPECT_EQ("KALMO_NotCollected.Kind=\"files\",Reason=\"it may hold keys or passwords\"\n"
+              "    Kind: files\n"
+              "    Reason: it may hold keys or passwords\n"
+              "    Count: 1\n"
+              "    Subjects: {\"/etc/shadow\"}\n",
+              Show("KALMO_NotCollected"));
+}
+
+TEST_F(BadSystemsTest, KindsThatWereNotAskedForAreNamed)
+{
+    TCollectionOptions options;
+    options.only = {"users", "mounts"};
+    options.skipped = {"mounts"};
+    EXPECT_EQ("all: it was not asked for\n", LinesAbout("packages", options));
+    EXPECT_EQ("all: it was not asked for\n", LinesAbout("mounts", options));
+    EXPECT_EQ("", LinesAbout("users", options));
+}
+
+TEST_F(BadSystemsTest, EmptySystemSaysWhatItLacks)
+{
+    const TOutputFolder empty;
+    TMadeCalls calls;
+    std::string xml;
+    std::string lines;
+    for (const std::string& line :
+         CollectInventory(TSystemRoot(empty.GetPath()), calls, {}, [&xml](std::string_view piece) { xml += piece; })) {
+        lines += line + "\n";
+    }
+    EXPECT_EQ("not collected: disks: /sys/block: there is no such folder\n"
+              "not collected: kernel: /proc/sys: there is no such folder\n"
+              "not collected: memory: /proc/meminfo, /proc/swaps: No such file or directory\n"
+              "not collected: mounts: /proc/self/mountinfo: No such file or directory\n"
+              "not collected: network: /sys/class/net: found no adapter, expected one\n"
+              "not collected: packages: the packages: found no database of dpkg or rpm\n"
+              "not collected: processors: /proc/cpuinfo: No such file or directory\n"
+              "not collected: units: the states of units: systemd does not run\n"
+              "not collected: users: /etc/passwd, /etc/group: No such file or directory\n",
+              lines);
+    EXPECT_TRUE(EndsWith(xml, "</CIM>\n")) << xml.substr(xml.size() - 100);
+}
+
+TEST_F(BadSystemsTest, TablesThatEndEarlyAreOneLine)
+{
+    fSystem->File("/proc/self/mountinfo", "25 1 8:1 / / rw,relatime shared:1 - ext4 /dev/sda1 rw\n30 25 0:26 / /s");
+    EXPECT_EQ("/proc/self/mountinfo: line 2: found \"30 25 0:26 / /s\", expected a mount with its type, source and options\n",
+              LinesAbout("mounts"));
+    fSystem->Append("/var/lib/dpkg/status", "Package: vim\nStatus: install ok inst");
+    EXPECT_EQ("/var/lib/dpkg/status: line 12: found the end of the file, expected the rest of the line\n", LinesAbout("packages"));
+    fSystem->File("/etc/passwd", "a\nb\nc\n");
+    EXPECT_EQ("/etc/passwd: line 1: found 1 fields, expected 7 (2 more of its lines are left out)\n", LinesAbout("users"));
+    fSystem->File("/proc/cpuinfo", "");
+    EXPECT_EQ("/proc/cpuinfo: found no processor, expected one\n", LinesAbout("processors"));
+}
+
+TEST_F(BadSystemsTest, DpkgAtWorkIsSaid)
+{
+    fSystem->File("/var/lib/dpkg/updates/0001", "Package: bash\n").File("/var/lib/dpkg/updates/tmp.i", "");
+    EXPECT_EQ("/var/lib/dpkg/updates: dpkg is at work or was interrupted, so the states of some packages may be older ones\n",
+              LinesAbout("packages"));
+}
+
+TEST_F(BadSystemsTest, PipesLoopsAndOddNamesInEtcAreNotOpened)
+{
+    ASSERT_EQ(0, mkfifo(fSystem->Place("/etc/pipe").c_str(), 0644));
+    fSystem->Link("/etc/loop", "loop").Link("/etc/up", "..").File("/etc/j\xF6rg\n.conf", "x\n");
+    const std::string text = Show("KALMO_ConfigurationFile");
+    EXPECT_NE(std::string::npos, text.find("Name: /etc/pipe\n    Type: fifo\n    Digest: NULL\n")) << text;
+    EXPECT_NE(std::string::npos, text.find("LinkTarget: ..\n")) << text;
+    EXPECT_NE(std::string::npos, text.find("Name: \"/etc/j\\\\xF6rg\\n.conf\"\n")) << text;
+    EXPECT_EQ("/etc/shadow: it may hold keys or passwords\n", LinesAbout("files"));
+}
+
+TEST_F(BadSystemsTest, FileSystemsOfOtherSystemsAreNotEntered)
+{
+    fSystem->File("/etc/shared/a", "").Append("/proc/self/mountinfo", "31 25 0:27 / /etc/shared rw - nfs4 nas:/etc rw\n");
+    EXPECT_EQ("/etc/shared: it is on another system; /etc/shadow: it may hold keys or passwords\n", LinesAbout("files"));
+    EXPECT_EQ(std::string::npos, Show("KALMO_ConfigurationFile").find("/etc/shared"));
+}
+
+TEST_F(BadSystemsTest, ExcludedFilesAreLeftOutWithoutAWord)
+{
+    TCollectionOptions options;
+    options.excluded = {"/etc/ssh*", "*/shadow"};
+    const std::string text = Show("KALMO_ConfigurationFile", options);
+    EXPECT_EQ(std::string::npos, text.find("/etc/ssh"));
+    EXPECT_EQ("", fLines);
+}
+
+TEST_F(BadSystemsTest, FilesForRootAreReadIfAskedFor)
+{
+    fSystem->File("/etc/sudoers", "root ALL\n", 0440).File("/etc/app/x.conf", "x\n");
+    ASSERT_EQ(0, chmod(fSystem->Place("/etc/app").c_str(), 0750));
+    EXPECT_EQ("/etc/shadow: it may hold keys or passwords; /etc/app, /etc/sudoers: only root may read it\n", LinesAbout("files"));
+    TCollectionOptions options;
+    options.hasRootFiles = true;
+    EXPECT_EQ("/etc/shadow: it may hold keys or passwords\n", LinesAbout("files", options));
+    EXPECT_NE(std::string::npos, Show("KALMO_ConfigurationFile", options).find("/etc/app/x.conf"));
+}
+
+TEST_F(BadSystemsTest, LimitOfTimeEndsWhatIsLeft)
+{
+    TCollectionOptions options;
+    options.timeLimit = std::chrono::seconds(10);
+    fSystem->fCalls.fTickLength = std::chrono::seconds(1);
+    EXPECT_EQ("the rest: the limit of 10 seconds was reached\n", LinesAbout("certificates", options));
+    EXPECT_EQ("", LinesAbout("system", options));
+    // What there is loads.
+    EXPECT_NE(std::string::npos, Show("KALMO_NotCollected", options).find("the limit of 10 seconds was reached"));
+    EXPECT_EQ(0, fStatus);
+}
+
+TEST_F(BadSystemsTest, RefusedCallsEndTheirKindAlone)
+{
+    fSystem->fCalls.fHasNoAddresses = true;
+    EXPECT_EQ("the rest: Operation not permitted\n", LinesAbout("network"));
+    EXPECT_NE(std::string::npos, Show("KALMO_User").find("web"));
+}
+
+TEST_F(BadSystemsTest, ThingsWithTheSameNameAreOneAndSaidSo)
+{
+    fSystem->Append("/etc/passwd", "web:x:1001:1001::/:/bin/false\n");
+    EXPECT_EQ("KALMO_User web: there was one with the same keys before\n", LinesAbout("users"));
+}
+
+}  // namespace NORVZEL20

@@ -1,0 +1,58 @@
+#include <gtest/gtest.h>
+
+#include "client/collect/read/ReadMountInfo.h"
+
+namespace NORVZEL20 {
+
+namespace {
+
+std::string MountsText(const std::string& text)
+{
+    TReadFaults faults;
+    std::string result;
+    for (const TMount& mount : ReadMountInfo(text, faults)) {
+        result += mount.path + "|" + mount.type + "|" + mount.source + "|" + mount.sourceFolder + "|";
+        for (const std::string& option : mount.options) {
+            result += option + " ";
+        }
+        result += "|";
+        for (const std::string& option : mount.fileSystemOptions) {
+            result += option + " ";
+        }
+        result += "\n";
+    }
+    return faults.GetCount() == 0 ? result : result + std::to_string(faults.GetCount()) + " bad: " + faults.GetFirst() + "\n";
+}
+
+}  // namespace
+
+TEST(MountInfoTest, MountsHaveSourceTypeAndBothKindsOfOptions)
+{
+    EXPECT_EQ("/|ext4|/dev/sda1|/|rw relatime |rw errors=remount-ro \n"
+              "/proc|proc|proc|/|rw nosuid nodev noexec relatime |rw \n"
+              "/mnt/my disk|vfat|/dev/sdb1|/|rw noatime |rw fmask=0022 codepage=437 \n"
+              "/srv/data|nfs4|nas:/vol1|/|rw relatime |rw vers=4.2 addr=192.0.2.5 \n"
+              "/run/lock|tmpfs||/|rw |rw \n",
+              MountsText("25 1 8:1 / / rw,relatime shared:1 - ext4 /dev/sda1 rw,errors=remount-ro\n"
+                         "23 25 0:21 / /proc rw,nosuid,nodev,noexec,relatime shared:12 - proc proc rw\n"
+                         "92 25 8:17 / /mnt/my\\040disk rw,noatime shared:47 master:3 propagate_from:2 - vfat /dev/sdb1 "
+                         "rw,fmask=0022,codepage=437\n"
+                         "99 25 0:45 / /srv/data rw,relatime - nfs4 nas:/vol1 rw,vers=4.2,addr=192.0.2.5\n"
+                         "30 25 0:26 / /run/lock rw - tmpfs  rw\n"));
+}
+
+TEST(MountInfoTest, EscapesAreThreeOctalDigits)
+{
+    EXPECT_EQ("/a\tb\\c\\9|x|s|/|o |o \n", MountsText("1 1 0:1 / /a\\011b\\134c\\9 o - x s o\n"));
+}
+
+TEST(MountInfoTest, LinesThatEndEarlyAreLeftOut)
+{
+    const char* const texts[] = {"25", "25 1 8:1 / /", "25 1 8:1 / / rw shared:1", "25 1 8:1 / / rw - ext4 /dev/sda1",
+                                 "25 1 8:1 - ext4 a b"};
+    for (const std::string text : texts) {
+        EXPECT_EQ("1 bad: line 1: found \"" + text + "\", expected a mount with its type, source and options\n", MountsText(text));
+    }
+}
+
+}  // namespace NORVZEL20

@@ -1,0 +1,115 @@
+#include <gtest/gtest.h>
+
+#include "client/collect/read/TextPieces.h"
+#include "tests/client/collect/TCollectFixture.h"
+
+namespace NORVZEL20 {
+
+class UnitsTest : public TCollectFixture {
+  protected:
+    TMadeSystem& Unit(const std::string& path, const std::string& text) { return fSystem->File(path, text); }
+
+    /// A line for each unit: name, state of its file, active state.
+    std::string States()
+    {
+        std::string text;
+        for (const std::string& line : ListOf(Show("KALMO_Unit"), '\n')) {
+            if (StartsWith(line, "Name: ")) {
+                text += (text.empty() ? "" : "\n") + line.substr(6);
+            } else if (StartsWith(line, "UnitFileState: ") || StartsWith(line, "ActiveState: ")) {
+                text += " " + line.substr(line.find(':') + 2);
+            }
+        }
+        return text + "\n";
+    }
+};
+
+TEST_F(UnitsTest, FilesAndLinksDecideWhetherAUnitIsEnabled)
+{
+    const std::string lib = "/usr/lib/systemd/system/";
+    const std::string etc = "/etc/systemd/system/";
+    const std::string installed = "[Install]\nWantedBy=multi-user.target\n";
+    Unit(lib + "a-disabled.service", installed);
+    Unit(lib + "b-static.service", "[Service]\n");
+    Unit(lib + "c-masked.service", installed).Link(etc + "c-masked.service", "/dev/null");
+    Unit(lib + "d-empty.service", installed).File("/run/systemd/system/d-empty.service", "");
+    Unit(lib + "e@.service", installed).Link(etc + "getty.target.wants/e@tty1.service", lib + "e@.service");
+    Unit(lib + "f.service", installed).Link(etc + "f-alias.service", lib + "f.service");
+    Unit(lib + "g.service", installed).Link("/run/systemd/system/x.target.requires/g.service", lib + "g.service");
+    Unit("/run/systemd/generator/h.service", "[Service]\n");
+    Unit(lib + "i.service", "[Install]\nAlso=f.service\n");
+    Unit(lib + "j.mount", "");
+    EXPECT_EQ("a-disabled.service disabled inactive\n"
+              "b-static.service static inactive\n"
+              "c-masked.service masked inactive\n"
+              "d-empty.service masked-runtime inactive\n"
+              "e@.service disabled NULL\n"
+              "e@tty1.service enabled inactive\n"
+              "f-alias.service alias NULL\n"
+              "f.service enabled inactive\n"
+              "g.service enabled-runtime inactive\n"
+              "h.service generated inactive\n"
+              "i.service indirect inactive\n"
+              "ssh.service enabled active\n",
+              States());
+}
+
+TEST_F(UnitsTest, UnitsOnDemandHaveAStateOnlyIfTheyFailed)
+{
+    Unit("/usr/lib/systemd/system/tidy.timer", "[Timer]\nOnCalendar=daily\n");
+    Unit("/usr/lib/systemd/system/tidy.service", "[Service]\nType=oneshot\n");
+    Unit("/usr/lib/systemd/system/host.service", "[Service]\nType=dbus\n");
+    fSystem->fCalls.fUnits->push_back({"tidy.service", "", "activating", "start"});
+    fSystem->fCalls.fUnits->push_back({"host.service", "", "failed", "failed"});
+    EXPECT_EQ("host.service static failed\nssh.service enabled active\ntidy.service static NULL\ntidy.timer static inactive\n",
+              States());
+}
+
+TEST_F(UnitsTest, UnitsWithoutAFileAreThoseThatAreLoaded)
+{
+    fSystem->fCalls.fUnits->push_back({"made.service", "Made", "active", "running"});
+    fSystem->fCalls.fUnits->push_back({"run-r123.service", "", "active", "running"});
+    fSystem->fCalls.fUnits->push_back({"session-1.scope", "", "active", "running"});
+    EXPECT_EQ("ssh.service enabled active\nmade.service NULL active\n", States());
+}
+
+TEST_F(UnitsTest, WithoutAnAnswerServicesWithProcessesAreActive)
+{
+    fSystem->fCalls.fUnits.reset();
+    Unit("/usr/lib/systemd/system/a.service", "").File("/usr/lib/systemd/system/b.socket", "[Socket]\n");
+    Unit("/usr/lib/systemd/system/c@.service", "[Service]\n");
+    fSystem->File("/sys/fs/cgroup/system.slice/ssh.service/cgroup.events", "populated 1\nfrozen 0\n");
+    fSystem->File("/sys/fs/cgroup/system.slice/system-c.slice/c@1.service/cgroup.procs", "17\n");
+    EXPECT_EQ("a.service masked inactive\nb.socket static NULL\nc@.service static NULL\nssh.service enabled active\nc@1.service "
+              "NULL active\n",
+              States());
+    EXPECT_NE(std::string::npos,
+              fLines.find("units: the states of units other than services: the service manager does not answer\n"))
+        << fLines;
+}
+
+TEST_F(UnitsTest, WithoutSystemdNoStateIsKnown)
+{
+    fSystem->Unlink("/run/systemd/system/.keep");
+    fSystem->RemoveFolder("/run/systemd/system");
+    EXPECT_EQ("ssh.service enabled NULL\n", States());
+    EXPECT_NE(std::string::npos, fLines.find("units: the states of units: systemd does not run\n")) << fLines;
+}
+
+TEST_F(UnitsTest, TimersAreJobs)
+{
+    Unit("/usr/lib/systemd/system/tidy.timer", "[Timer]\nOnCalendar=daily\nOnBootSec=5min\n");
+    EXPECT_EQ("KALMO_ScheduledJob.Command=\"run-parts /etc/cron.hourly\",Source=\"/etc/crontab\",User=\"root\"\n"
+              "    Source: /etc/crontab\n"
+              "    Command: run-parts /etc/cron.hourly\n"
+              "    User: root\n"
+              "    Schedules: {\"17 * * * *\"}\n"
+              "KALMO_ScheduledJob.Command=\"tidy.service\",Source=\"tidy.timer\",User=\"\"\n"
+              "    Source: tidy.timer\n"
+              "    Command: tidy.service\n"
+              "    User: \"\"\n"
+              "    Schedules: {\"OnBootSec=5min\", \"OnCalendar=daily\"}\n",
+              Show("KALMO_ScheduledJob"));
+}
+
+}  // namespace NORVZEL20
