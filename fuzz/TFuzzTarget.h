@@ -18,6 +18,7 @@ struct TFuzzTarget {
 
 void FuzzArguments(std::string_view input);      ///< a command line of the client, one argument a line
 void FuzzBaseline(std::string_view input);       ///< a file of accepted differences
+void FuzzCollect(std::string_view input);        ///< a text or bytes of a system from which an inventory is collected
 void FuzzEngine(std::string_view input);         ///< throws of dice, from which namespaces and rules are made
 void FuzzHttp(std::string_view input);           ///< recorded answers of HTTP
 void FuzzInventory(std::string_view input);      ///< a CIM-XML document

@@ -17,6 +17,8 @@ namespace NORVZEL20 {
 namespace {
 
 using TProgramNames = std::map<std::uint64_t, std::set<std::string>>;  // by inode
+constexpr std::uint64_t kNoInode = 0;                                  // the kernel's own socket, such as that of a tunnel
+
 using TSocketKey = std::tuple<std::string, std::string, std::uint16_t>;
 
 struct TSocketUsers {
@@ -73,7 +75,8 @@ std::vector<std::pair<std::string, TSocket>> ReadAllSockets(TCollection& collect
         const std::optional<std::string> text = collection.ReadIfThere(path);
         TReadFaults faults;
         for (const TSocket& socket : ReadSockets(text.value_or(std::string()), faults)) {
-            if (protocol[0] == 't' || socket.port < handedOut.first || socket.port > handedOut.second) {
+            const bool isHandedOut = socket.port >= handedOut.first && socket.port <= handedOut.second;
+            if (protocol[0] == 't' || !isHandedOut || socket.inode == kNoInode) {
                 sockets.emplace_back(protocol, socket);
             }
         }
@@ -87,6 +90,9 @@ std::vector<std::pair<std::string, TSocket>> ReadAllSockets(TCollection& collect
 void CollectSockets(TCollection& collection)
 {
     const std::vector<std::pair<std::string, TSocket>> sockets = ReadAllSockets(collection);
+    if (!collection.GetRoot().Look("/proc/net/tcp")) {
+        collection.LeaveOut("/proc/net", "it lists no sockets");
+    }
     TProgramNames programs;
     for (const auto& [protocol, socket] : sockets) {
         programs[socket.inode];
@@ -99,7 +105,7 @@ void CollectSockets(TCollection& collection)
         const std::set<std::string>& names = programs[socket.inode];
         user.programs.insert(names.begin(), names.end());
         user.userId = socket.userId;
-        user.isKnown &= !names.empty();
+        user.isKnown &= !names.empty() || socket.inode == kNoInode;
     }
     for (const auto& [key, user] : users) {
         TFacts facts("KALMO_ListeningSocket");

@@ -65,6 +65,7 @@ TEST_F(BadSystemsTest, EmptySystemSaysWhatItLacks)
               "not collected: network: /sys/class/net: found no adapter, expected one\n"
               "not collected: packages: the packages: found no database of dpkg or rpm\n"
               "not collected: processors: /proc/cpuinfo: No such file or directory\n"
+              "not collected: sockets: /proc/net: it lists no sockets\n"
               "not collected: units: the states of units: systemd does not run\n"
               "not collected: users: /etc/passwd, /etc/group: No such file or directory\n",
               lines);

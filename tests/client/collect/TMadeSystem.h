@@ -36,6 +36,7 @@ class TMadeSystem {
         File("/proc/stat", "cpu 1 2 3\nbtime 1700000000\n");
         File("/proc/cpuinfo", "processor\t: 0\nmodel name\t: Fast 1\nphysical id\t: 0\ncore id\t\t: 0\nflags\t\t: sse fpu\n\n");
         File("/proc/meminfo", "MemTotal:        1024 kB\nMemAvailable:     100 kB\n");
+        File("/proc/net/tcp", "heading\n");
         File("/proc/swaps", "Filename Type Size Used Priority\n");
         File("/sys/block/sda/size", "2048\n");
         File("/sys/block/sda/sda1/size", "1024\n");
