@@ -88,6 +88,7 @@ class TReaders {
             fFacts.push_back(TFacts("KALMO_Package")
                                  .Key("Name", package.name)
                                  .Key("Architecture", package.architecture)
+                                 .Key("Manager", "rpm")
                                  .Text("Vendor", package.vendor));
         }
     }

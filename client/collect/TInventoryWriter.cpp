@@ -36,8 +36,12 @@ std::string PathOf(const ICIMClass& cls, const ICIMInstance& instance)
 {
     std::string path = cls.GetName(TCallContext());
     const auto append = [&](const std::string* key) {
+        const TCIMValue& value = instance.GetProperty(*key, TCallContext())->GetValue(TCallContext());
+        if (value.IsNull()) {
+            throw TZELException(TZELStatusCode(TZELStatusCode::kKeyMissing));
+        }
         path += '\n';
-        instance.GetProperty(*key, TCallContext())->GetValue(TCallContext()).AppendKeyText(path);
+        value.AppendKeyText(path);
         return true;
     };
     cls.EnumerateKeyNames(append, TCallContext());

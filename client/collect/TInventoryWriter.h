@@ -19,7 +19,7 @@ class TInventoryWriter {
     explicit TInventoryWriter(TCimXmlWriter::TSink sink);
 
     /// Writes an instance. Returns false, and writes nothing, if there was one with the same keys already. Class, properties and
-    /// types must be as declared. Errors: TZELException if they are not.
+    /// types must be as declared, and each key must have a value. Errors: TZELException if not.
     bool Add(const TFacts& facts);
 
     /// Ends the document. Call it once.
