@@ -31,8 +31,9 @@ void AddCollectOptions(CLI::App* command, TCollectOptions& options)
         ->option_text("FILE");
     AddKinds(command, "--only", options.collection.only, "collect these kinds alone: " + AllKinds());
     AddKinds(command, "--skip", options.collection.skipped, "do not collect these kinds");
-    AddText(command, "--exclude", options.collection.excluded,
-            "leave out configuration files whose paths match this shell pattern; the option may be repeated")
+    AddText(
+        command, "--exclude", options.collection.excluded,
+        "leave out configuration files and certificates in files whose paths match this shell pattern; the option may be repeated")
         ->allow_extra_args(false)
         ->option_text("PATTERN");
     command->add_flag("--root-files", options.collection.hasRootFiles,

@@ -44,7 +44,7 @@ bool AddCertificates(TCollection& collection, const std::string& path, const str
 void CollectCertificates(TCollection& collection)
 {
     TFileWalk walk(
-        collection, [](const std::string&) { return true; },
+        collection, [&collection](const std::string& path) { return !collection.IsExcluded(path); },
         [&collection](const std::string& path, const struct stat& status) { return AddCertificates(collection, path, status); });
     for (const char* const folder : kCertificateFolders) {
         walk.Walk(folder);

@@ -50,6 +50,9 @@ constexpr const char* kNoConfiguration[] = {
     "/etc/udev/hwdb.bin",
 };
 
+// Users and groups are instances of their own.
+constexpr std::array<const char*, 4> kAccountFiles = {"/etc/passwd", "/etc/group", "/etc/subuid", "/etc/subgid"};
+
 std::string TypeOf(mode_t mode)
 {
     switch (mode & S_IFMT) {
@@ -86,10 +89,8 @@ class TConfigurationFiles {
 
     bool IsWanted(const std::string& path) const
     {
-        const auto matches = [&path](const std::string& pattern) { return fnmatch(pattern.c_str(), path.c_str(), 0) == 0; };
-        const std::vector<std::string>& excluded = fCollection.GetOptions().excluded;
-        return std::none_of(std::begin(kNoConfiguration), std::end(kNoConfiguration), matches) &&
-               std::none_of(excluded.begin(), excluded.end(), matches);
+        const auto matches = [&path](const char* pattern) { return fnmatch(pattern, path.c_str(), 0) == 0; };
+        return !fCollection.IsExcluded(path) && std::none_of(std::begin(kNoConfiguration), std::end(kNoConfiguration), matches);
     }
 
     bool Visit(const std::string& path, const struct stat& status)
@@ -138,8 +139,9 @@ class TConfigurationFiles {
 
     void AddContents(TFacts& facts, const std::string& path, const struct stat& status)
     {
-        if (path == "/etc/passwd" || path == "/etc/group") {
-            return;  // the users and groups are instances of their own
+        const auto isPath = [&path](const char* other) { return path == other; };
+        if (std::any_of(std::begin(kAccountFiles), std::end(kAccountFiles), isPath)) {
+            return;
         }
         std::string trouble;
         if (HoldsSecrets(path)) {

@@ -1,7 +1,7 @@
 // Modules of the kernel, and the parameters of /proc/sys.
 //
-// Some files of /proc/sys are no settings: they count, they are made anew at each read, or they are secrets. They are never read.
-// Files that can only be written are commands and are passed over without a word.
+// Some files of /proc/sys are no settings: they count, they are made anew at each read, the kernel changes them, or they are
+// secrets. They are never read. Files that can only be written are commands and are passed over without a word.
 #include <fnmatch.h>
 
 #include <algorithm>
@@ -28,6 +28,7 @@ constexpr const char* kNoSettings[] = {
     "fs/quota/*",
     "kernel/hostname",
     "kernel/ns_last_pid",
+    "kernel/perf_event_max_sample_rate",
     "kernel/pty/nr",
     "kernel/random/boot_id",
     "kernel/random/entropy_avail",

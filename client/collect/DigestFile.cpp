@@ -7,6 +7,7 @@
 #include <array>
 #include <cerrno>
 #include <memory>
+#include <new>
 #include <string_view>
 
 namespace NORVZEL20 {
@@ -23,7 +24,12 @@ struct TEndDigest {
 // Digests a text piece by piece, and watches for a private key in it.
 class TDigest {
   public:
-    TDigest() : fContext(EVP_MD_CTX_new()) { EVP_DigestInit_ex(fContext.get(), EVP_sha256(), nullptr); }
+    TDigest() : fContext(EVP_MD_CTX_new())
+    {
+        if (!fContext || EVP_DigestInit_ex(fContext.get(), EVP_sha256(), nullptr) != 1) {
+            throw std::bad_alloc();  // nothing else can go wrong
+        }
+    }
 
     void Add(std::string_view piece)
     {

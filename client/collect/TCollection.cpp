@@ -1,5 +1,8 @@
 #include "client/collect/TCollection.h"
 
+#include <fnmatch.h>
+
+#include <algorithm>
 #include <utility>
 
 #include "client/collect/read/TTextLines.h"
@@ -11,6 +14,12 @@ namespace NORVZEL20 {
 TCollection::TCollection(const TSystemRoot& root, ISystemCalls& calls, const TCollectionOptions& options, TInventoryWriter& writer)
     : fRoot(root), fCalls(calls), fOptions(options), fWriter(writer), fEnd(calls.Tick() + options.timeLimit)
 {}
+
+bool TCollection::IsExcluded(const std::string& path) const
+{
+    return std::any_of(fOptions.excluded.begin(), fOptions.excluded.end(),
+                       [&path](const std::string& pattern) { return fnmatch(pattern.c_str(), path.c_str(), 0) == 0; });
+}
 
 void TCollection::CheckTime() const
 {

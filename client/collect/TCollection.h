@@ -31,6 +31,9 @@ class TCollection {
     const TCollectionOptions& GetOptions() const noexcept { return fOptions; }
     const TOmissions& GetOmissions() const noexcept { return fOmissions; }
 
+    /// Whether the options exclude files of that path.
+    bool IsExcluded(const std::string& path) const;
+
     /// What is left out from now on belongs to this kind.
     void BeginKind(const std::string& kind) { fKind = kind; }
 

@@ -2,6 +2,7 @@
 //
 //   passwd   name:password:number:number of the group:description:home:shell
 //   group    name:password:number:member,member
+//   subuid   name:first number:how many numbers
 //
 // A line that begins with + or - includes another source of accounts (NIS) and is no account.
 #include "client/collect/read/ReadAccounts.h"
@@ -40,6 +41,15 @@ void ForEachAccount(std::string_view text, std::size_t count, TReadFaults& fault
 }
 
 }  // namespace
+
+TSubordinateNumbers ReadSubordinateNumbers(std::string_view text, TReadFaults& faults)
+{
+    TSubordinateNumbers numbers;
+    ForEachAccount(text, 3, faults, [&numbers](const TAccountFields& fields) {
+        numbers[std::string(fields[0])].push_back(std::string(fields[1]) + ":" + std::string(fields[2]));
+    });
+    return numbers;
+}
 
 std::vector<TFacts> ReadUsers(std::string_view text, TReadFaults& faults)
 {

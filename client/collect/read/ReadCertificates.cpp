@@ -19,6 +19,7 @@
 #include <ctime>
 #include <map>
 #include <memory>
+#include <new>
 #include <optional>
 
 namespace NORVZEL20 {
@@ -139,6 +140,9 @@ TFacts FactsOf(const X509& certificate, const std::string& path, const std::stri
 std::optional<std::string> Decoded(std::string_view text)
 {
     const std::unique_ptr<EVP_ENCODE_CTX, TFreeObject<EVP_ENCODE_CTX, &EVP_ENCODE_CTX_free>> decoder(EVP_ENCODE_CTX_new());
+    if (!decoder) {
+        throw std::bad_alloc();
+    }
     std::string bytes(text.size() + 3, '\0');
     auto* const out = reinterpret_cast<unsigned char*>(bytes.data());
     int length = 0;

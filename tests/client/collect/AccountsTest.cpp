@@ -26,6 +26,21 @@ TEST(AccountsTest, GroupsHaveTheirMembers)
               ReadText(&ReadGroups, "root:x:0:\nadm:x:4:syslog,web\n"));
 }
 
+TEST(AccountsTest, SubordinateNumbersAreThoseOfAUser)
+{
+    TReadFaults faults;
+    std::string text;
+    for (const auto& [name, ranges] : ReadSubordinateNumbers("web:100000:65536\nadm:1:2\nweb:300000:5\n7:x:2\n7:5\n", faults)) {
+        text += name;
+        for (const std::string& range : ranges) {
+            text += " " + range;
+        }
+        text += "\n";
+    }
+    EXPECT_EQ("7 x:2\nadm 1:2\nweb 100000:65536 300000:5\n", text);
+    EXPECT_EQ("line 5: found 2 fields, expected 3", faults.GetFirst());
+}
+
 TEST(AccountsTest, BadLinesAreLeftOutAndTheFirstIsDescribed)
 {
     const struct {

@@ -111,6 +111,21 @@ TEST_F(RpmDatabaseTest, NothingIsWritten)
     EXPECT_TRUE(TSystemRoot(fSystem->Place("")).List("/var/lib/rpm").size() == 1);
 }
 
+TEST_F(RpmDatabaseTest, ChangesThatStandInALogAreSeen)
+{
+    Execute("PRAGMA journal_mode=WAL");
+    MakeTable();
+    sqlite3* database = nullptr;
+    ASSERT_EQ(SQLITE_OK, sqlite3_open(fSystem->Place(kDatabase).c_str(), &database));
+    Install(Header("bash", "5.1", "1"));  // the open connection keeps the log
+    ASSERT_LT(0U, std::filesystem::file_size(fSystem->Place(kDatabase) + "-wal"));
+    EXPECT_NE(std::string::npos, Show("KALMO_Package").find("Version: 5.1-1"));
+    EXPECT_EQ(SQLITE_OK, sqlite3_exec(database, "BEGIN IMMEDIATE; DELETE FROM Packages", nullptr, nullptr, nullptr));
+    EXPECT_NE(std::string::npos, Show("KALMO_Package").find("Version: 5.1-1"));
+    EXPECT_EQ("nothing", PackagesLine());
+    sqlite3_close(database);
+}
+
 TEST_F(RpmDatabaseTest, DamagedDatabasesAreOneLine)
 {
     fSystem->File(kDatabase, "no database");

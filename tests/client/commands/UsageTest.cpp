@@ -13,7 +13,7 @@ TEST_F(UsageTest, HelpIsACommandToo)
     EXPECT_EQ(general, Result({"help"}));
     EXPECT_EQ(general, Result({"help", "help"}));
     EXPECT_EQ(general, Result({"help", "--help"}));
-    for (const char* const command : {"compare", "check", "explain", "query", "show"}) {
+    for (const char* const command : {"compare", "check", "explain", "query", "show", "collect"}) {
         const std::string help = Result({command, "--help"});
         EXPECT_NE(std::string::npos, help.find(std::string("Usage: cimdelta ") + command)) << help;
         EXPECT_EQ(help, Result({"help", command}));
@@ -40,14 +40,14 @@ TEST_F(UsageTest, EachCommandKnowsTheVersion)
 {
     const std::string version = Result({"--version"});
     EXPECT_EQ("cimdelta ", version.substr(0, 9));
-    for (const char* const command : {"compare", "check", "explain", "query", "show"}) {
+    for (const char* const command : {"compare", "check", "explain", "query", "show", "collect"}) {
         EXPECT_EQ(version, Result({command, "--version"}));
     }
 }
 
 TEST_F(UsageTest, WrongUsageIsReportedInOneLine)
 {
-    const char kCommands[] = "compare, check, explain, query or show; see cimdelta --help";
+    const char kCommands[] = "compare, check, explain, query, show or collect; see cimdelta --help";
     const struct {
         std::vector<std::string> arguments;
         std::string message;
@@ -100,7 +100,7 @@ TEST_F(UsageTest, WithoutAnyArgumentACommandIsAskedFor)
     TFakeConsole console;
     EXPECT_EQ(2, RunClient(0, nullptr, console));
     EXPECT_EQ("", console.fOut);
-    EXPECT_EQ("cimdelta: name a command: compare, check, explain, query or show; see cimdelta --help\n", console.fErr);
+    EXPECT_EQ("cimdelta: name a command: compare, check, explain, query, show or collect; see cimdelta --help\n", console.fErr);
 }
 
 }  // namespace
