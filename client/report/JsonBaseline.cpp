@@ -2,12 +2,12 @@
 //
 //   { "file": "base.txt", "accepting": false, "accepted": 37, "new": 1, "changedSince": 1,
 //     "changed": [ { "kind": "changed", "instance": "Disk.Id=\"sda\"", "inventories": [ "web02" ],
-//                    "values": [ { "property": "Size", "reference": "uint64 500", "other": "uint64 300" } ], "reason": "",
+//                    "values": [ { "property": "Size", "reference": "uint64 500", "other": "uint64 300" } ], "acceptedBecause": "",
 //                    "accepted": [ { "property": "Size", "reference": "uint64 500", "other": "uint64 250" } ] } ],
-//     "gone": [ { "kind": ..., "instance": ..., "inventories": [ ... ], "values": [ ... ], "reason": "replaced in June" } ],
+//     "gone": [ { "kind": ..., "instance": ..., "inventories": [ ... ], "values": [ ... ], "acceptedBecause": "June" } ],
 //     "notCompared": [ ... ], "otherInventories": [ "web09" ], "entriesOfOtherInventories": 2 }
 //
-// Values are texts as in the file. "reference" is there only for "changed". The reason of a changed entry is the accepted one's.
+// Values are texts as in the file. "reference" is null except for "changed". "acceptedBecause" is the reason in the file.
 #include "client/report/JsonBaseline.h"
 
 #include "client/report/JsonDifference.h"
@@ -22,12 +22,8 @@ TJson JsonOfValues(const std::vector<TAcceptedDifference::TValue>& values)
 {
     TJson list = TJson::array();
     for (const TAcceptedDifference::TValue& value : values) {
-        TJson json = {{"property", value.property}};
-        if (!value.before.empty()) {
-            json["reference"] = value.before;
-        }
-        json["other"] = value.after;
-        list.push_back(std::move(json));
+        const TJson before = value.before.empty() ? TJson(nullptr) : TJson(value.before);
+        list.push_back({{"property", value.property}, {"reference", before}, {"other", value.after}});
     }
     return list;
 }
@@ -38,7 +34,7 @@ TJson JsonOfEntry(const TAcceptedDifference& entry)
             {"instance", entry.instance},
             {"inventories", entry.inventories},
             {"values", JsonOfValues(entry.values)},
-            {"reason", entry.reason}};
+            {"acceptedBecause", entry.reason}};
 }
 
 TJson JsonOfEntries(const std::vector<TAcceptedDifference>& entries)
@@ -57,7 +53,7 @@ nlohmann::ordered_json JsonOfBaseline(const TBaselineOutcome& outcome)
     TJson changed = TJson::array();
     for (const TBaselineOutcome::TChanged& pair : outcome.changed) {
         TJson json = JsonOfEntry(pair.present);
-        json["reason"] = pair.accepted.reason;
+        json["acceptedBecause"] = pair.accepted.reason;
         json["accepted"] = JsonOfValues(pair.accepted.values);
         changed.push_back(std::move(json));
     }

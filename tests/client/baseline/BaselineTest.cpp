@@ -280,14 +280,15 @@ TEST_F(BaselineTest, JsonHasWhatIsGoneAndWhatChanged)
     System("web02", {{"sda", "3"}, {"sdb", "5"}});
     const std::string json = Compare({"--baseline", fBaseline, "-o", "ndjson"});
     const std::size_t begin = json.find("\"baseline\":");
-    EXPECT_EQ("\"baseline\":{\"file\":\"base.txt\",\"accepting\":false,\"accepted\":0,\"new\":0,\"changedSince\":1,"
-              "\"changed\":[{\"kind\":\"changed\",\"instance\":\"Disk.Id=\\\"sda\\\"\",\"inventories\":[\"web02\"],"
-              "\"values\":[{\"property\":\"Size\",\"reference\":\"uint16 1\",\"other\":\"uint16 3\"}],\"reason\":\"tested\","
-              "\"accepted\":[{\"property\":\"Size\",\"reference\":\"uint16 1\",\"other\":\"uint16 2\"}]}],"
-              "\"gone\":[{\"kind\":\"onlyInOthers\",\"instance\":\"Disk.Id=\\\"sdc\\\"\",\"inventories\":[\"web02\"],"
-              "\"values\":[{\"property\":\"Size\",\"other\":\"uint16 7\"}],\"reason\":\"tested\"}],"
-              "\"notCompared\":[],\"otherInventories\":[],\"entriesOfOtherInventories\":0}",
-              json.substr(begin, json.find(",\"classes\":[", begin) - begin));
+    EXPECT_EQ(
+        "\"baseline\":{\"file\":\"base.txt\",\"accepting\":false,\"accepted\":0,\"new\":0,\"changedSince\":1,"
+        "\"changed\":[{\"kind\":\"changed\",\"instance\":\"Disk.Id=\\\"sda\\\"\",\"inventories\":[\"web02\"],"
+        "\"values\":[{\"property\":\"Size\",\"reference\":\"uint16 1\",\"other\":\"uint16 3\"}],\"acceptedBecause\":\"tested\","
+        "\"accepted\":[{\"property\":\"Size\",\"reference\":\"uint16 1\",\"other\":\"uint16 2\"}]}],"
+        "\"gone\":[{\"kind\":\"onlyInOthers\",\"instance\":\"Disk.Id=\\\"sdc\\\"\",\"inventories\":[\"web02\"],"
+        "\"values\":[{\"property\":\"Size\",\"reference\":null,\"other\":\"uint16 7\"}],\"acceptedBecause\":\"tested\"}],"
+        "\"notCompared\":[],\"otherInventories\":[],\"entriesOfOtherInventories\":0}",
+        json.substr(begin, json.find(",\"classes\":[", begin) - begin));
 }
 
 TEST_F(BaselineTest, AFileThatCannotBeReadOrWrittenIsRefusedBeforeAnythingElse)
