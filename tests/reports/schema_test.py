@@ -34,10 +34,8 @@ from small_documents import (  # noqa: E402
 )
 
 CIMDELTA, ROOT = (pathlib.Path(sys.argv[1]).resolve(), pathlib.Path(sys.argv[2]).resolve()) if len(sys.argv) > 2 else (None, None)
-<<<<<<< HEAD
 =======
 ACCEPTED = ROOT / "tests/client/data/accepted.txt" if ROOT else None
->>>>>>> 12185ff (baseline: its JSON is as strict as the schema)
 OPTIONAL = {"sharing", "path", "madeIn", "embedded", "parts", "disagreements", "baseline"}
 MAPS = {"keys", "contents", "properties"}  # names in them are those of an inventory
 WORDS = {"format", "role", "namespaceFrom", "kind", "state", "reason", "takenAs", "type"}
@@ -150,7 +148,7 @@ CASES = {
     "equal": ([document(disk("")), document(disk(""))],),
     "a fleet": ([ROOT / "tests/client/data" / f"web0{number}.xml" for number in (1, 2, 3)] if ROOT else [],),
     "the majority": ([ROOT / "tests/client/data" / f"web0{number}.xml" for number in (1, 2, 3)] if ROOT else [], ["--reference", "majority"]),
-    "a baseline": ([ROOT / "tests/client/data" / f"web0{number}.xml" for number in (1, 2, 3)] if ROOT else [], ["--baseline", str(ACCEPTED)]),
+    "a baseline of a fleet": ([ROOT / "tests/client/data" / f"web0{number}.xml" for number in (1, 2, 3)] if ROOT else [], ["--baseline", str(ACCEPTED)]),
     "every type": ([document(disk(DECLARED_TYPES, of_every_type(column))) for column in (1, 2)],),
     "every type and null": ([document(disk(DECLARED_TYPES, of_every_type(1))), document(disk(DECLARED_TYPES, ""))],),
     "every type in contents": ([document(disk(DECLARED_TYPES)), document(disk(DECLARED_TYPES, of_every_type(2)))],),
