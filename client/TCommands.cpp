@@ -8,6 +8,7 @@
 #include "client/AddLoadingOptions.h"
 #include "client/AddReferenceOptions.h"
 #include "client/AddReportOptions.h"
+#include "client/AddSelection.h"
 #include "client/AddSystemNames.h"
 #include "client/AddTerminalOptions.h"
 #include "client/AddText.h"
@@ -119,8 +120,9 @@ void TCommands::AddCompare()
         AddCommand("compare", "show what differs between a reference and other inventories", [this](IConsole& console) {
             std::vector<std::string> inventories = fOthers;
             inventories.insert(inventories.begin(), fReference);
-            const TCommandFiles files{inventories, fCompare.rules, fCompare.output, fCompare.baseline.baseline,
-                                      fCompare.baseline.accept};
+            const TCommandFiles files{
+                inventories,        fCompare.rules, fCompare.output, fCompare.baseline.baseline, fCompare.baseline.accept,
+                fCompare.savedRules};
             fCompare.inventories = PrepareFiles(files, fCompare.loading, 2, console);
             return RunCompare(fCompare, console);
         });
@@ -132,6 +134,7 @@ void TCommands::AddCompare()
     AddFormat(command, fCompare.format, ReportFormatNames());
     AddLoadingOptions(command, fCompare.loading, kSchemaNames);
     AddSystemNames(command, fCompare.systems);
+    AddSelection(command, fCompare);
     AddOutput(command, fCompare.output);
     AddStrictSchema(command, fCompare.strictSchema);
     AddReferenceOptions(command, fCompare);

@@ -4,6 +4,7 @@
 #include <utility>
 
 #include "client/baseline/ReadBaseline.h"
+#include "client/commands/SaveRules.h"
 #include "client/commands/TCountingDifferences.h"
 #include "client/comparison/SeeFromMajority.h"
 #include "client/comparison/TComparison.h"
@@ -35,6 +36,12 @@ void CheckOptions(const TCompareOptions& options)
     if (options.format == EOutputFormat::kCimXml && IsBesideBaseline(options.baseline)) {
         throw TClientError("-o cimxml writes the records of all differences, so it cannot be combined with --accept or --baseline; "
                            "choose another format");
+    }
+    if (options.format == EOutputFormat::kCimXml && !options.only.kinds.empty()) {
+        throw TClientError("--only cannot be used with -o cimxml, which has all records of the comparison; leave one of them out");
+    }
+    if (!options.baseline.accept.empty() && !options.only.kinds.empty()) {
+        throw TClientError("--only cannot be used with --accept, which keeps all differences, shown or not; leave one of them out");
     }
     if (options.text.isSummary && options.format != EOutputFormat::kText) {
         throw TClientError("--summary is for text reports; leave it out, or -o, whose reports have a summary of their own");
@@ -84,6 +91,15 @@ void Deliver(TComparisonReport& report, const TCompareOptions& options, const TB
     }
 }
 
+void ShowOnly(TComparisonReport& report, const TOnlyShown& only)
+{
+    if (!only.kinds.empty()) {
+        const auto shown = std::make_shared<TOnlyKinds>(report.differences, only.kinds);
+        report.notShown = {shown->CountOthers(), only.option};
+        report.differences = shown;
+    }
+}
+
 }  // namespace
 
 int RunCompare(const TCompareOptions& options, IConsole& console)
@@ -102,16 +118,18 @@ int RunCompare(const TCompareOptions& options, IConsole& console)
     std::optional<TBaseline> baseline = ReadBaselineIfNamed(options.baseline);
     std::vector<TInventory> inventories = TInventoryLoader(console, options.loading).Load(sources);
     AlignSystemNames(inventories, options.systems);
-    TComparisonReport report = TComparison(inventories, console).Run(rules, options.strictSchema);
+    TComparisonReport report = TComparison(inventories, console).Run(rules, options.strictSchema, options.selection);
     if (!options.allowEmpty && report.coverage.IsNothingCompared()) {
         throw TClientError(DescribeNothingCompared(report, inventories, options.rules, options.strictSchema));
     }
+    SaveRules(options.savedRules, report, options.selection, console);
     if (reference.WantsMajority()) {
         report = SeeFromMajority(report);
     }
     if (baseline) {
         baseline = ApplyBaseline(report, std::move(*baseline), options.baseline);
     }
+    ShowOnly(report, options.only);
     const bool isAccepting = !options.baseline.accept.empty();
     Deliver(report, options, isAccepting ? &*baseline : nullptr, console);
     return isAccepting || report.differences->GetCounts().GetTotal() == 0 ? kExitSuccess : kExitDifferences;

@@ -5,6 +5,7 @@
 
 #include "client/baseline/ApplyBaseline.h"
 #include "client/commands/EColorChoice.h"
+#include "client/comparison/TOnlyKinds.h"
 #include "client/inventory/TInventorySources.h"
 #include "client/inventory/TLoadingOptions.h"
 #include "client/inventory/TReferenceChoice.h"
@@ -12,8 +13,15 @@
 #include "client/process/IConsole.h"
 #include "client/report/EOutputFormat.h"
 #include "client/report/TTextOptions.h"
+#include "client/rules/TSelection.h"
 
 namespace NORVZEL20 {
+
+/// Which kinds of differences are shown.
+struct TOnlyShown {
+    TOnlyKinds::TKinds kinds;  ///< none: all of them
+    std::string option;        ///< as it was typed
+};
 
 /// The arguments of `cimdelta compare`.
 struct TCompareOptions {
@@ -30,6 +38,9 @@ struct TCompareOptions {
     bool allowEmpty = false;  ///< whether it is no error if nothing was compared
     TLoadingOptions loading;
     TSystemNames systems;
+    TSelection selection;
+    TOnlyShown only;
+    std::string savedRules;  ///< empty: the rules are not saved
 };
 
 /// Compares inventories. Returns kExitSuccess (0) for no differences, or for none that are not accepted, otherwise kExitDifferences

@@ -1,5 +1,6 @@
 #include "client/commands/PrepareFiles.h"
 
+#include "client/commands/SaveRules.h"
 #include "client/files/TInputFile.h"
 #include "client/inventory/CheckInventoryFiles.h"
 #include "client/inventory/DropRepeatedFiles.h"
@@ -54,6 +55,7 @@ std::vector<TInventorySources> PrepareFiles(const TCommandFiles& files, TLoading
     }
     CheckBaselineFiles(files, inputs);
     CheckOutput(files.output, inputs);
+    CheckSavedRules(files.savedRules, inputs, files.output);
     loading.output = IsStandardOutput(files.output) ? std::string() : files.output;
     CheckInventoryFiles(toLoad);
     inventories = DropRepeatedInventories(std::move(inventories), fewest, console);

@@ -16,6 +16,7 @@ struct TCommandFiles {
     std::string output;                    ///< empty: standard output
     std::string baseline = std::string();  ///< is read; empty: none
     std::string accept = std::string();    ///< likewise, if it is there, and replaced; empty: none
+    std::string savedRules = std::string();  ///< is written; empty: none are saved
 };
 
 /// Checks the files before a command reads the first of them, so that nobody waits for large inventories to learn of a misspelt

@@ -20,14 +20,14 @@ bool HasInstances(const std::vector<TInventory>& inventories, const std::string&
 
 }  // namespace
 
-void RefuseRecordKeys(const std::vector<TInventory>& inventories, TRules& rules, const std::string& name)
+void RefuseRecordKeys(const std::vector<TInventory>& inventories, TRules& rules, const std::string& name, bool hasLines)
 {
     for (const boost::shared_ptr<TInMemClass>& cls : inventories[0].ns->GetClasses()) {
         if (IsRecordClass(cls->GetName()) && !rules.ExcludedKeysOf(cls->GetName()).empty() && !rules.PropertiesOf(cls).empty() &&
             HasInstances(inventories, cls->GetName())) {
             const TRuleTrace trace(rules.GetDocument(), inventories[0].ns);
-            throw TClientError(name + ":" + std::to_string(trace.Find(cls->GetName()).excludedKeysLine) + ": " +
-                               DescribeRecordKeys(cls->GetName()));
+            const std::string line = ":" + std::to_string(trace.Find(cls->GetName()).excludedKeysLine);
+            throw TClientError(name + (hasLines ? line : "") + ": " + DescribeRecordKeys(cls->GetName()));
         }
     }
 }

@@ -11,6 +11,7 @@
 #include <algorithm>
 #include <set>
 
+#include "client/comparison/AttributeToOptions.h"
 #include "client/comparison/FindNameHint.h"
 #include "client/comparison/ReadDeltaRecords.h"
 #include "client/comparison/ReferenceStandIns.h"
@@ -27,6 +28,8 @@
 #include "client/process/LackOfMemory.h"
 #include "client/process/TClientError.h"
 #include "client/process/TProgress.h"
+#include "client/rules/ApplySelection.h"
+#include "client/rules/DescribeSelection.h"
 #include "client/rules/MadeRules.h"
 #include "client/rules/SayRuleWarnings.h"
 #include "client/rules/TLogCapture.h"
@@ -71,7 +74,24 @@ void KeepForever(const boost::shared_ptr<TDeltaNamespace>& records)
 
 }  // namespace
 
-TComparisonReport TComparison::Run(const std::optional<TRulesText>& rules, bool strictSchema)
+TComparisonReport TComparison::Run(const std::optional<TRulesText>& rules, bool strictSchema, const TSelection& selection)
+{
+    Prepare(rules, strictSchema);
+    if (selection.IsEmpty()) {
+        return RunWith(fRules);
+    }
+    TRulesDraft draft = MakeDraft();
+    ApplySelection(selection, draft);
+    const std::string name = DescribeSelection(selection);
+    const auto narrowed = std::make_shared<TRules>(fInventories[0].ns, TRulesText{name, draft.Write({}), true});
+    RefuseRecordKeys(fInventories, *narrowed, name, false);
+    TComparisonReport report = RunWith(narrowed);
+    report.options = name;
+    AttributeToOptions(report.coverage, fInventories, *fRules);
+    return report;
+}
+
+void TComparison::Prepare(const std::optional<TRulesText>& rules, bool strictSchema)
 {
     fStrictSchema = strictSchema;
     if (strictSchema) {
@@ -81,27 +101,40 @@ TComparisonReport TComparison::Run(const std::optional<TRulesText>& rules, bool 
         PutReferenceStandIns(fInventories);
     }
     PutTextStandIns(fInventories);
-    const TRulesText text =
-        rules ? *rules
-              : TRulesText{"the rules made for " + fInventories[0].path, MakeRulesForEverything(fInventories, fNotes), true};
-    const auto meaning = std::make_shared<TRules>(fInventories[0].ns, text);
-    if (!text.isMade) {
-        RefuseRecordKeys(fInventories, *meaning, text.name);
+    fText = rules ? *rules
+                  : TRulesText{"the rules made for " + fInventories[0].path, MakeRulesForEverything(fInventories, fNotes), true};
+    fRules = std::make_shared<TRules>(fInventories[0].ns, fText);
+    if (!fText.isMade) {
+        RefuseRecordKeys(fInventories, *fRules, fText.name, true);
         SayRuleWarnings(
-            fConsole, text.name, meaning->GetDocument(), fInventories[0].ns,
-            TSuggestedCommand("check").AddFile(text.name).AddSchemas(fInventories, strictSchema).Advise("shows all of them"));
+            fConsole, fText.name, fRules->GetDocument(), fInventories[0].ns,
+            TSuggestedCommand("check").AddFile(fText.name).AddSchemas(fInventories, strictSchema).Advise("shows all of them"));
     }
-    return RunWith(meaning, text);
 }
 
-TComparisonReport TComparison::RunWith(const std::shared_ptr<TRules>& rules, const TRulesText& text)
+TRulesDraft TComparison::MakeDraft()
+{
+    return TRulesDraft(fInventories[0].ns, *fRules, fText.isMade);
+}
+
+TComparisonReport TComparison::Try(const TRulesDraft* changes)
+{
+    fKeepsReference = true;
+    if (changes == nullptr) {
+        return RunWith(fRules);
+    }
+    return RunWith(std::make_shared<TRules>(fInventories[0].ns, TRulesText{fText.name, changes->Write({}), true}));
+}
+
+TComparisonReport TComparison::RunWith(const std::shared_ptr<TRules>& rules)
 {
     const TProgress progress(fConsole, "comparing");
     TComparisonReport report;
     report.inventories = &fInventories;
-    report.rules = text.name;
-    report.rulesText = text.text;
-    report.areRulesMade = text.isMade;
+    report.rules = fText.name;
+    report.rulesText = fText.text;
+    report.areRulesMade = fText.isMade;
+    report.meaning = rules;
     for (const TInventory& inventory : fInventories) {
         report.labels.push_back(inventory.label);
         report.paths.push_back(inventory.path);
@@ -109,12 +142,12 @@ TComparisonReport TComparison::RunWith(const std::shared_ptr<TRules>& rules, con
     }
     report.coverage = TCoverageBuilder(fInventories, *rules, fNotes).Build();
     report.coverage.hint = FindNameHint(fInventories, *rules, fNotes);
-    report.idleRules = text.isMade ? std::vector<std::string>() : FindIdleRules(rules->GetDocument());
+    report.idleRules = fText.isMade ? std::vector<std::string>() : FindIdleRules(fRules->GetDocument());
     report.records = MakeDeltaNamespace();
     if (rules->HasExcludedKeys()) {
         KeepForever(report.records);
     }
-    const TTemporaryFile file(text.text);
+    const TTemporaryFile file(rules->GetText());
     report.records->SetSpecFileName(file.GetPath());
     FindDifferences(*report.records, *rules);
     report.differences = std::make_shared<TDifferenceList>(fInventories, rules, *report.records);
@@ -185,6 +218,9 @@ bool TComparison::MustKeepReference() const
 {
     if (fInventories.size() != 2) {
         return false;
+    }
+    if (fKeepsReference) {
+        return true;
     }
     // The plug-in would give values the types that are declared.
     if (std::any_of(fInventories.begin(), fInventories.end(), &KeepsText)) {

@@ -9,6 +9,8 @@
 #include "client/comparison/IDifferences.h"
 #include "client/comparison/TBaselineOutcome.h"
 #include "client/comparison/TCoverage.h"
+#include "client/comparison/TNotShown.h"
+#include "client/rules/TRules.h"
 #include "embedded/load/TLoadReport.h"
 #include "provider/TDeltaNamespace.h"
 
@@ -22,12 +24,15 @@ struct TComparisonReport {
     std::string rules;                ///< what messages call the rules
     std::string rulesText;            ///< their whole document
     bool areRulesMade = false;        ///< whether the person named no rules
+    std::string options;              ///< what messages call the options that narrow the rules; empty if there are none
+    std::shared_ptr<TRules> meaning;  ///< the rules of the run, options included
     TCoverage coverage;
     std::vector<std::string> idleRules;  ///< the classes that a rules file names although no inventory has instances of their trees
     const std::vector<TInventory>* inventories;  ///< those that were compared; they must outlive this
     boost::shared_ptr<TDeltaNamespace> records;  ///< the delta namespace of the run
     std::shared_ptr<IDifferences> differences;   ///< what the records stand for; reads the inventories
     std::optional<TBaselineOutcome> baseline;    ///< if `differences` are what a baseline does not accept
+    TNotShown notShown;                          ///< the differences of the run that `differences` leaves out
     /// If the reference is what most inventories have (see SeeFromMajority): the report of the run, which says what was compared,
     /// and `inventories`. Otherwise null.
     std::shared_ptr<const TComparisonReport> run = nullptr;

@@ -17,6 +17,7 @@ struct TCoverage {
         kCompared,
         kExcludedByRules,      ///< the rules reach the class, but leave no property to compare
         kReachedByNoElement,   ///< no element of the rules is for the class or one above it
+        kLeftOutByOptions,     ///< the rules compare the class, but options leave no property of it
         kNothingToCompare,     ///< the class has no property, or only the time of collection
         kUnknownToReference,   ///< the reference does not declare the class
         kOperatingSystemMade,  ///< the client made the reference's instance of KALMO_OperatingSystem, or those of all others
@@ -27,7 +28,8 @@ struct TCoverage {
         kUsedAsKey,         ///< it identifies instances, and the rules do not have it compared as a property
         kNotDeclared,       ///< the reference does not declare it
         kTimeOfCollection,  ///< the plug-in leaves it out if the default is to include
-        kLeftOutByRules
+        kLeftOutByRules,
+        kSelectedOut  ///< the rules have it compared, but options leave it out
     };
 
     /// A property that is not compared.

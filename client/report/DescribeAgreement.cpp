@@ -1,5 +1,6 @@
 #include "client/report/DescribeAgreement.h"
 
+#include "client/report/DescribeNotShown.h"
 #include "client/report/DisplayLabels.h"
 #include "client/text/Counted.h"
 #include "client/text/DisplayText.h"
@@ -11,6 +12,10 @@ std::string DescribeAgreement(const TComparisonReport& report)
     const std::string between = " between " + DisplayLabels(report, {0}) + " and " + DisplayOthers(report);
     if (report.coverage.IsNothingCompared()) {
         return "Nothing was compared" + between + ".";
+    }
+    const std::string notShown = DescribeNotShown(report);
+    if (!notShown.empty()) {
+        return "No differences of the kinds to be shown" + between + "; " + notShown + ".";
     }
     if (report.baseline && report.baseline->accepted > 0) {
         return "Nothing new" + between + " since " + EscapeForDisplay(report.baseline->file) + ": " +

@@ -45,6 +45,7 @@ std::vector<std::string> Reasons(const TComparisonReport& report)
         {TCoverage::kReachedByNoElement, "no element of the rules is for ", " or a class above (letter case counts)"},
         {TCoverage::kExcludedByRules, "the rules exclude every property of ",
          " (the default is to exclude; default=\"include\" includes)"},
+        {TCoverage::kLeftOutByOptions, report.options + " leaves out ", ""},
         {TCoverage::kNothingToCompare, "there is no property to compare in ", ""},
         {TCoverage::kUnknownToReference, NameOfInput(report.paths[0]) + " does not declare ", ""},
         {TCoverage::kOperatingSystemMade, "", " is not compared, since cimdelta made an instance of it"},
@@ -69,6 +70,9 @@ std::string Advice(const TComparisonReport& report, const std::vector<TInventory
                    bool strictSchema)
 {
     const auto isAny = [&report](TCoverage::EState state) { return !ClassesIn(state, report.coverage).empty(); };
+    if (isAny(TCoverage::kLeftOutByOptions)) {
+        return "; name others in the options, or leave the options out";
+    }
     if (rulesFile.empty()) {
         // Other inventories do not help a class without properties.
         const bool isOnlyThat = isAny(TCoverage::kNothingToCompare) && !isAny(TCoverage::kOperatingSystemMade);

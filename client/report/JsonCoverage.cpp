@@ -17,6 +17,8 @@ const char* StateName(TCoverage::EState state)
         return "excludedByRules";
     case TCoverage::kReachedByNoElement:
         return "reachedByNoElement";
+    case TCoverage::kLeftOutByOptions:
+        return "leftOutByOptions";
     case TCoverage::kNothingToCompare:
         return "nothingToCompare";
     case TCoverage::kUnknownToReference:
@@ -61,6 +63,8 @@ const char* ReasonName(TCoverage::EReason reason)
         return "notDeclared";
     case TCoverage::kTimeOfCollection:
         return "timeOfCollection";
+    case TCoverage::kSelectedOut:
+        return "leftOutByOptions";
     default:
         return "excludedByRules";
     }

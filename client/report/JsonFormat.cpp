@@ -5,7 +5,8 @@
 //     "summary": { "differences": 1, "onlyInReference": 0, "onlyInOthers": 0, "changedValues": 1, "changedInstances": 1,
 //                  "instancesOnlyInOthers": 0, "everythingCompared": false, "nothingCompared": false,
 //                  "classes": [ { "class": "Disk", "onlyInReference": 0, "onlyInOthers": 0, "changedValues": 1,
-//                                 "changedInstances": 1 } ] },
+//                                 "changedInstances": 1 } ],
+//                  "notShown": { "option": "--only +", "onlyInReference": 0, "onlyInOthers": 0, "changedValues": 3 } },
 //     "groups": [ ... ],
 //     "differences": [ ... ],
 //     "coverage": { "classes": [ { "class": "Disk", "state": "compared", "instances": [ 1, 1 ], "propertiesLeftOut": [ "Model" ],
@@ -49,15 +50,23 @@ using TJson = nlohmann::ordered_json;
 TJson JsonOfSummary(const TComparisonReport& report, const TFindings& findings)
 {
     const TDifferenceCounts& counts = report.differences->GetCounts();
-    return {{"differences", counts.GetTotal()},
-            {"onlyInReference", counts.onlyInReference},
-            {"onlyInOthers", counts.onlyInOthers},
-            {"changedValues", counts.changedValues},
-            {"changedInstances", counts.changedInstances},
-            {"instancesOnlyInOthers", counts.instancesOnlyInOthers},
-            {"everythingCompared", report.coverage.IsComplete()},
-            {"nothingCompared", report.coverage.IsNothingCompared()},
-            {"classes", JsonOfClassCounts(findings)}};
+    TJson summary = {{"differences", counts.GetTotal()},
+                     {"onlyInReference", counts.onlyInReference},
+                     {"onlyInOthers", counts.onlyInOthers},
+                     {"changedValues", counts.changedValues},
+                     {"changedInstances", counts.changedInstances},
+                     {"instancesOnlyInOthers", counts.instancesOnlyInOthers},
+                     {"everythingCompared", report.coverage.IsComplete()},
+                     {"nothingCompared", report.coverage.IsNothingCompared()},
+                     {"classes", JsonOfClassCounts(findings)}};
+    if (!report.notShown.option.empty()) {
+        const TDifferenceCounts& others = report.notShown.counts;
+        summary["notShown"] = {{"option", report.notShown.option},
+                               {"onlyInReference", others.onlyInReference},
+                               {"onlyInOthers", others.onlyInOthers},
+                               {"changedValues", others.changedValues}};
+    }
+    return summary;
 }
 
 const char* NamespaceOrigin(TLoadReport::ENamespaceOrigin origin)

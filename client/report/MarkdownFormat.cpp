@@ -22,6 +22,7 @@
 // A group that the text would shorten is folded, with all of its examples in it. What comes from inventories stands as code, in
 // which nothing has a meaning, except in headings and in the last lines, where it is escaped.
 #include "client/report/MarkdownFormat.h"
+#include "client/report/DescribeNotShown.h"
 
 #include <boost/algorithm/string/classification.hpp>
 #include <boost/algorithm/string/predicate.hpp>
@@ -55,7 +56,7 @@ class TMarkdown {
 
     void Write(const TTextSink& sink) const
     {
-        sink("## " + EscapeForMarkdown(TGroupedText(fReport, fFindings, fOptions).Summary()) + "\n\n");
+        sink("## " + EscapeForMarkdown(AddNotShown(TGroupedText(fReport, fFindings, fOptions).Summary(), fReport)) + "\n\n");
         if (!IsPair()) {
             sink(Inventories());
         }

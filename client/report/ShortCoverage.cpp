@@ -32,12 +32,12 @@ std::string Range(const std::vector<std::size_t>& counts)
     return *least == *most ? std::to_string(*least) : std::to_string(*least) + " to " + std::to_string(*most);
 }
 
-std::size_t CountLeftOutByRules(const TCoverage& coverage)
+std::size_t CountLeftOut(const TCoverage& coverage, TCoverage::EReason reason)
 {
     std::size_t count = 0;
     for (const TCoverage::TClass& cls : coverage.classes) {
         for (const TCoverage::TLeftOut& leftOut : cls.leftOut) {
-            count += leftOut.reason == TCoverage::kLeftOutByRules ? 1 : 0;
+            count += leftOut.reason == reason ? 1 : 0;
         }
     }
     return count;
@@ -51,9 +51,13 @@ std::string Compared(const TComparisonReport& report)
     }
     std::string line = Range(counts) + (counts.size() > 2 ? " instances of each in " : " instances in ") +
                        Counted(report.coverage.CountComparedClasses(), "class", "classes") + " compared";
-    const std::size_t leftOut = CountLeftOutByRules(report.coverage);
-    if (leftOut > 0) {
-        line += "; " + Counted(leftOut, "property", "properties") + " left out by " + EscapeForDisplay(report.rules);
+    const std::size_t byRules = CountLeftOut(report.coverage, TCoverage::kLeftOutByRules);
+    if (byRules > 0) {
+        line += "; " + Counted(byRules, "property", "properties") + " left out by " + EscapeForDisplay(report.rules);
+    }
+    const std::size_t byOptions = CountLeftOut(report.coverage, TCoverage::kSelectedOut);
+    if (byOptions > 0) {
+        line += "; " + Counted(byOptions, "property", "properties") + " left out by " + EscapeForDisplay(report.options);
     }
     return line + (report.coverage.IsComplete() ? "" : kSeeCoverage) + "\n";
 }

@@ -28,6 +28,7 @@
 #include "client/report/BaselineText.h"
 #include "client/report/DescribeAgreement.h"
 #include "client/report/DescribeLargestGroup.h"
+#include "client/report/DescribeNotShown.h"
 #include "client/report/DisplayLabels.h"
 #include "client/report/ShortCoverage.h"
 #include "client/report/TClassLines.h"
@@ -42,7 +43,7 @@ namespace NORVZEL20 {
 
 std::string TGroupedText::Write() const
 {
-    std::string text = Bold(Summary()) + "\n";
+    std::string text = Bold(AddNotShown(Summary(), fReport)) + "\n";
     if (fReport.labels.size() > 2) {
         text += WhoDiffers();
     }

@@ -18,6 +18,7 @@
 
 #include "client/report/BaselineText.h"
 #include "client/report/DescribeAgreement.h"
+#include "client/report/DescribeNotShown.h"
 #include "client/report/DisplayLabels.h"
 #include "client/report/TDifferenceText.h"
 #include "client/report/TextColors.h"
@@ -29,7 +30,7 @@ namespace NORVZEL20 {
 
 void TTextFormat::Write(const TTextSink& sink) const
 {
-    sink(Paint(fOptions.isColored, kBold, Summary()) + "\n");
+    sink(Paint(fOptions.isColored, kBold, AddNotShown(Summary(), fReport)) + "\n");
     WriteDifferences(sink);
     sink(WriteBaselineText(fReport, fOptions));
     sink("\n" + WriteTextCoverage(fReport));

@@ -5,6 +5,7 @@
 //   Not compared, because the rules exclude every property: Process (12 / 7).
 //   KALMO_OperatingSystem not compared in web03, because cimdelta made the instance there.
 //   Properties of Disk not compared, because the rules leave them out: Caption, Model.
+//   Properties of Disk not compared, because of --exclude Disk.Serial: Serial.
 //   Properties of Disk used as keys, not compared as properties: Id.
 //   Instances of Disk with the key of an earlier one, since the rules leave out Bus: 2 of web01, not compared; ...
 //   References of Mount were compared without key Bus and without their namespace.
@@ -73,6 +74,7 @@ class TStatement {
         WriteClasses(TCoverage::kExcludedByRules, "Not compared, because the rules exclude every property");
         WriteClasses(TCoverage::kReachedByNoElement,
                      "Not compared, because no element of the rules is for the class or one above it");
+        WriteClasses(TCoverage::kLeftOutByOptions, "Not compared, because of " + EscapeForDisplay(fReport.options));
         WriteClasses(TCoverage::kNothingToCompare, "Not compared, because the class has no property to compare");
         WriteClasses(TCoverage::kUnknownToReference, "Not compared, because " + Label(0) + " does not declare the class");
         WriteClasses(TCoverage::kOperatingSystemMade, "Not compared, because " + Makers());
@@ -129,6 +131,8 @@ class TStatement {
             const std::string name = EscapeForDisplay(cls.name);
             WriteLeftOut(cls, TCoverage::kLeftOutByRules,
                          "Properties of " + name + " not compared, because the rules leave them out");
+            WriteLeftOut(cls, TCoverage::kSelectedOut,
+                         "Properties of " + name + " not compared, because of " + EscapeForDisplay(fReport.options));
             WriteLeftOut(cls, TCoverage::kTimeOfCollection,
                          "Property of " + name + " not compared, because it is the time of collection");
             WriteLeftOut(cls, TCoverage::kNotDeclared,

@@ -34,7 +34,6 @@ from small_documents import (  # noqa: E402
 )
 
 CIMDELTA, ROOT = (pathlib.Path(sys.argv[1]).resolve(), pathlib.Path(sys.argv[2]).resolve()) if len(sys.argv) > 2 else (None, None)
-=======
 ACCEPTED = ROOT / "tests/client/data/accepted.txt" if ROOT else None
 OPTIONAL = {"sharing", "path", "madeIn", "embedded", "parts", "disagreements", "baseline"}
 MAPS = {"keys", "contents", "properties"}  # names in them are those of an inventory
