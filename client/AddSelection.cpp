@@ -67,7 +67,7 @@ void AddSelection(CLI::App* command, TCompareOptions& options)
 
 void AddSaveRules(CLI::App* command, std::string& path)
 {
-    AddText(command, "--save-rules", path, "write what is compared as a rules file, whole or not at all")->option_text("FILE");
+    AddText(command, "--save-rules", path, "write the rules to this file, whole or not at all")->option_text("FILE");
 }
 
 }  // namespace NORVZEL20

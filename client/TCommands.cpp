@@ -98,6 +98,7 @@ TCommands::TCommands(CLI::App& app) : fApp(app)
     app.formatter(std::make_shared<THelp>());  // before the commands, which inherit it
     AddVersion(app);
     AddCompare();
+    AddNoise();
     AddCheck();
     AddExplain();
     AddQuery();
@@ -142,6 +143,30 @@ void TCommands::AddCompare()
     AddBaseline(command, fCompare.baseline);
     AddTerminalOptions(command, fCompare);
     command->add_flag("--allow-empty", fCompare.allowEmpty, "do not take it for an error if nothing was compared");
+}
+
+void TCommands::AddNoise()
+{
+    CLI::App* command = AddCommand(
+        "noise", "find rules that leave out what changes by itself between inventories of one system", [this](IConsole& console) {
+            std::vector<std::string> inventories = fOthers;
+            inventories.insert(inventories.begin(), fReference);
+            fNoise.inventories =
+                PrepareFiles({inventories, fNoise.rules, fNoise.output, fNoise.savedRules}, fNoise.loading, 2, console);
+            return RunNoise(fNoise, console);
+        });
+    AddText(command, "REFERENCE", fReference, kInventoryHelp)->required()->option_text(" ");
+    AddText(command, "OTHER", fOthers, "later inventories of the same system")->required()->option_text("...");
+    AddText(command, "--spec", fNoise.rules,
+            "a rules file to start from, or - for standard input (default: everything is compared)")
+        ->option_text("RULES");
+    AddFormat(command, fNoise.format, {"text", "json"});
+    AddLoadingOptions(command, fNoise.loading, kSchemaNames);
+    AddSystemNames(command, fNoise.systems);
+    AddSaveRules(command, fNoise.savedRules);
+    AddOutput(command, fNoise.output);
+    AddStrictSchema(command, fNoise.strictSchema);
+    command->add_flag("--coverage", fNoise.text.hasWholeCoverage, "show all of what was compared and what not");
 }
 
 void TCommands::AddCheck()

@@ -7,6 +7,7 @@
 #include "client/commands/CollectCommand.h"
 #include "client/commands/CompareCommand.h"
 #include "client/commands/ExplainCommand.h"
+#include "client/commands/NoiseCommand.h"
 #include "client/commands/QueryCommand.h"
 #include "client/commands/ShowCommand.h"
 #include "client/process/IConsole.h"
@@ -29,6 +30,7 @@ class TCommands {
   private:
     CLI::App* AddCommand(const char* name, const char* description, std::function<int(IConsole&)> run);
     void AddCompare();
+    void AddNoise();
     void AddCheck();
     void AddCollect();
     void AddExplain();
@@ -40,6 +42,7 @@ class TCommands {
     std::string fReference;            // as typed
     std::vector<std::string> fOthers;  // likewise: the other inventories of compare, and those of the other commands
     TCompareOptions fCompare;
+    TNoiseOptions fNoise;
     TCheckOptions fCheck;
     TCollectOptions fCollect;
     TExplainOptions fExplain;

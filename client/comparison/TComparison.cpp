@@ -1,8 +1,9 @@
 // A comparison in steps:
 //
 // (1) Complete the inventories: each then declares what the others declare. With --strict-schema, leave them as they are.
-// (2) Read the rules; if there are none, make rules that include every class. The plug-in reads rules from files only and by name,
-//     so it gets a temporary file. It holds exactly what was read here: a file could change meanwhile, and standard input is gone.
+// (2) Read the rules; if there are none, make rules that include every class. What options select of that becomes new rules, so that
+//     nothing but rules decides. The plug-in reads rules from files only and by name, so it gets a temporary file. It holds exactly
+//     what was read here: a file could change meanwhile, and standard input is gone.
 // (3) Find out what will be compared. This must be done before the run, which may add instances to the reference.
 // (4) Let the plug-in compare. Its log is captured, because it says more about a failure than the exception does.
 // (5) List the plug-in's records. They are read back as differences with values when they are written.

@@ -22,7 +22,8 @@ TEST_F(ExecutableTest, TroubleGoesToStandardErrorAlone)
 {
     EXPECT_EQ("[2]\n--\ncimdelta: none.xml: cannot be opened: No such file or directory\n",
               Shell("compare --detail web01.xml none.xml"));
-    EXPECT_EQ("[2]\n--\ncimdelta: frob is no command; name one: compare, check, explain, query, show or collect; see cimdelta --help\n",
+    EXPECT_EQ("[2]\n--\ncimdelta: frob is no command; name one: compare, noise, check, explain, query, show or collect; see "
+              "cimdelta --help\n",
               Shell("frob"));
 }
 

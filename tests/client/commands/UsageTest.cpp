@@ -47,7 +47,7 @@ TEST_F(UsageTest, EachCommandKnowsTheVersion)
 
 TEST_F(UsageTest, WrongUsageIsReportedInOneLine)
 {
-    const char kCommands[] = "compare, check, explain, query, show or collect; see cimdelta --help";
+    const char kCommands[] = "compare, noise, check, explain, query, show or collect; see cimdelta --help";
     const struct {
         std::vector<std::string> arguments;
         std::string message;
@@ -100,7 +100,8 @@ TEST_F(UsageTest, WithoutAnyArgumentACommandIsAskedFor)
     TFakeConsole console;
     EXPECT_EQ(2, RunClient(0, nullptr, console));
     EXPECT_EQ("", console.fOut);
-    EXPECT_EQ("cimdelta: name a command: compare, check, explain, query, show or collect; see cimdelta --help\n", console.fErr);
+    EXPECT_EQ("cimdelta: name a command: compare, noise, check, explain, query, show or collect; see cimdelta --help\n",
+              console.fErr);
 }
 
 }  // namespace

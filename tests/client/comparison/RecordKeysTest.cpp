@@ -40,6 +40,17 @@ TEST_F(RecordKeysTest, WithAllTheirKeysOrUncomparedTheyDoNotMatter)
               Compare("KALMO_Delta' default='exclude' excludekeys='DeltaID'/><class name='KALMO_DeltaClass' default='include'"));
 }
 
+TEST_F(RecordKeysTest, AnOptionThatExcludesThemIsRefusedToo)
+{
+    const std::string first = Scratch("first.xml", Result({"compare", "-o", "cimxml", "web01.xml", "web02.xml"}));
+    const std::string second = Scratch("second.xml", Result({"compare", "-o", "cimxml", "web01.xml", "web03.xml"}));
+    const std::string refused = Complaint({"compare", first, second, "--exclude-key", "KALMO_Delta.*"});
+    EXPECT_EQ("cimdelta: --exclude-key 'KALMO_Delta.*': rules for class KALMO_Delta cannot have excludekeys",
+              refused.substr(0, refused.find(',')));
+    const std::string noise = Result({"noise", first, second});
+    EXPECT_EQ(std::string::npos, noise.find("--exclude-key KALMO")) << noise;
+}
+
 /// Rules may name the classes although no inventory has instances of them.
 TEST_F(RecordKeysTest, WithoutInstancesTheyDoNotMatter)
 {
