@@ -240,6 +240,24 @@ TEST_F(NoiseTest, OneSystemUnderTwoNamesIsOne)
     EXPECT_NE(std::string::npos, report.find("--exclude-key Boot.BootId     1 of 1 instance")) << report;
 }
 
+TEST_F(NoiseTest, InventoriesAreLoadedAsForACompare)
+{
+    const std::string schema =
+        Scratch("schema.xml", Document(Class("Device", "", KeyProperty("Id") + Declaration("Load", "uint8"))));
+    for (const std::string load : {"5", "6", "700"}) {
+        const std::string name = "boot" + load;
+        const std::string device = Instance("Device", Value("Id", "cpu0") + Value("Load", load, "uint8"));
+        fPaths.push_back(name + "=" + Scratch(name + ".xml", Document(System() + device)));
+    }
+    Run({"noise", fPaths[0], fPaths[1], fPaths[2], "--schema", schema, "--bad-values", "null", "--coverage"});
+    EXPECT_EQ(1, fStatus) << fErr;
+    EXPECT_EQ("1 difference between boot5 and boot6, boot700; 1 rule leaves all of them out\n\n"
+              "--exclude Device.Load  changed in 1 of 1 instance in 2 of 2 comparisons: 5 -> 6 (boot6) / NULL (boot700)\n\n"
+              "Compared: 2 classes; 2 instances of boot5, 2 instances of boot6, 2 instances of boot700.\n",
+              fOut.substr(0, fOut.find("\n", fOut.find("Compared: ")) + 1));
+    EXPECT_NE(std::string::npos, fOut.find("taken as NULL: Device.Load")) << fOut;
+}
+
 TEST_F(NoiseTest, WhatCannotBeIsAnError)
 {
     TakeThree();
