@@ -121,9 +121,8 @@ void TCommands::AddCompare()
         AddCommand("compare", "show what differs between a reference and other inventories", [this](IConsole& console) {
             std::vector<std::string> inventories = fOthers;
             inventories.insert(inventories.begin(), fReference);
-            const TCommandFiles files{
-                inventories,        fCompare.rules, fCompare.output, fCompare.baseline.baseline, fCompare.baseline.accept,
-                fCompare.savedRules};
+            TCommandFiles files{inventories, fCompare.rules, fCompare.output, fCompare.baseline.baseline, fCompare.baseline.accept};
+            files.savedRules = fCompare.savedRules;
             fCompare.inventories = PrepareFiles(files, fCompare.loading, 2, console);
             return RunCompare(fCompare, console);
         });
@@ -147,14 +146,15 @@ void TCommands::AddCompare()
 
 void TCommands::AddNoise()
 {
-    CLI::App* command = AddCommand(
-        "noise", "find rules that leave out what changes by itself between inventories of one system", [this](IConsole& console) {
-            std::vector<std::string> inventories = fOthers;
-            inventories.insert(inventories.begin(), fReference);
-            fNoise.inventories =
-                PrepareFiles({inventories, fNoise.rules, fNoise.output, fNoise.savedRules}, fNoise.loading, 2, console);
-            return RunNoise(fNoise, console);
-        });
+    CLI::App* command = AddCommand("noise", "find rules that leave out what changes by itself between inventories of one system",
+                                   [this](IConsole& console) {
+                                       std::vector<std::string> inventories = fOthers;
+                                       inventories.insert(inventories.begin(), fReference);
+                                       TCommandFiles files{inventories, fNoise.rules, fNoise.output};
+                                       files.savedRules = fNoise.savedRules;
+                                       fNoise.inventories = PrepareFiles(files, fNoise.loading, 2, console);
+                                       return RunNoise(fNoise, console);
+                                   });
     AddText(command, "REFERENCE", fReference, kInventoryHelp)->required()->option_text(" ");
     AddText(command, "OTHER", fOthers, "later inventories of the same system")->required()->option_text("...");
     AddText(command, "--spec", fNoise.rules,

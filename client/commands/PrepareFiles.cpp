@@ -55,7 +55,7 @@ std::vector<TInventorySources> PrepareFiles(const TCommandFiles& files, TLoading
     }
     CheckBaselineFiles(files, inputs);
     CheckOutput(files.output, inputs);
-    CheckSavedRules(files.savedRules, inputs, files.output);
+    CheckSavedRules(files.savedRules, inputs, {files.output, files.accept});
     loading.output = IsStandardOutput(files.output) ? std::string() : files.output;
     CheckInventoryFiles(toLoad);
     inventories = DropRepeatedInventories(std::move(inventories), fewest, console);

@@ -1,5 +1,7 @@
 #include "client/commands/SaveRules.h"
 
+#include <algorithm>
+
 #include "client/process/TClientError.h"
 #include "client/report/TResultOutput.h"
 #include "client/rules/DescribeSelection.h"
@@ -7,7 +9,7 @@
 
 namespace NORVZEL20 {
 
-void CheckSavedRules(const std::string& path, const std::vector<std::string>& inputs, const std::string& output)
+void CheckSavedRules(const std::string& path, const std::vector<std::string>& inputs, const std::vector<std::string>& written)
 {
     if (path.empty()) {
         return;
@@ -15,8 +17,8 @@ void CheckSavedRules(const std::string& path, const std::vector<std::string>& in
     if (IsStandardOutput(path)) {
         throw TClientError("--save-rules writes a file, since the result goes to standard output; name a file");
     }
-    if (path == output) {
-        throw TClientError("--save-rules and --output name the same file, " + path + "; name two");
+    if (std::count(written.begin(), written.end(), path) > 0) {
+        throw TClientError("--save-rules names a file that is written for another option too, " + path + "; name two");
     }
     CheckOutput(path, inputs);
 }

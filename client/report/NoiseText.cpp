@@ -36,7 +36,7 @@ std::size_t CountDifferences(const TComparisonReport& report)
     return report.differences->GetCounts().GetTotal();
 }
 
-std::string Verdict(const TNoise& noise)
+std::string NoiseVerdict(const TNoise& noise)
 {
     const std::size_t before = CountDifferences(noise.before);
     if (before == 0) {
@@ -131,7 +131,7 @@ std::string NoiseEvidence(const TNoise& noise, const TNoiseRule& rule)
 
 std::string WriteNoiseText(const TNoise& noise, const TTextOptions& options)
 {
-    std::string text = Paint(options.isColored, kBold, Verdict(noise)) + "\n";
+    std::string text = Paint(options.isColored, kBold, NoiseVerdict(noise)) + "\n";
     std::vector<std::pair<std::string, std::string>> rows;
     for (const TNoiseRule& rule : noise.rules) {
         rows.emplace_back(EscapeForDisplay(NoiseOption(rule)), NoiseEvidence(noise, rule));

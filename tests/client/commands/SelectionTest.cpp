@@ -10,25 +10,25 @@
 namespace NORVZEL20 {
 namespace {
 
-std::string Reference(const std::string& name, const std::string& path, const std::string& qualifiers = std::string())
+std::string ReferenceTo(const std::string& name, const std::string& path, const std::string& qualifiers = std::string())
 {
     return "<PROPERTY.REFERENCE NAME=\"" + name + "\">" + qualifiers +
            (path.empty() ? "" : "<VALUE.REFERENCE>" + path + "</VALUE.REFERENCE>") + "</PROPERTY.REFERENCE>";
 }
 
 /// Element above Package, Kernel (a package) and Disk; a mount refers to a disk by key, an owner to a package.
-std::string Inventory(const std::string& contents)
+std::string ElementInventory(const std::string& contents)
 {
     return Document(System() + Class("Element", "", Declaration("Caption", "string") + Declaration("InstallDate", "string")) +
                     Class("Package", "Element", KeyProperty("Name") + Declaration("Version", "string")) +
                     Class("Kernel", "Package", Declaration("Flavour", "string")) +
                     Class("Disk", "Element", KeyProperty("Id") + KeyProperty("BootId") + Declaration("Size", "uint32")) +
-                    Class("Mount", "", Reference("Device", "", kKey) + KeyProperty("Point") + Declaration("Options", "string")) +
-                    Class("Owner", "", KeyProperty("Name") + Reference("Owned", "")) + contents);
+                    Class("Mount", "", ReferenceTo("Device", "", kKey) + KeyProperty("Point") + Declaration("Options", "string")) +
+                    Class("Owner", "", KeyProperty("Name") + ReferenceTo("Owned", "")) + contents);
 }
 
-std::string Package(const std::string& cls, const std::string& name, const std::string& version, const std::string& date,
-                    const std::string& more = std::string())
+std::string PackageOf(const std::string& cls, const std::string& name, const std::string& version, const std::string& date,
+                      const std::string& more = std::string())
 {
     return Instance(cls, Value("Name", name) + Value("Version", version) + Value("InstallDate", date) +
                              Value("Caption", name + " " + version) + more);
@@ -43,10 +43,10 @@ std::string DiskPath(const std::string& id, const std::string& boot)
 std::string DiskAt(const std::string& id, const std::string& boot, const std::string& size)
 {
     return Instance("Disk", Value("Id", id) + Value("BootId", boot) + Value("Size", size, "uint32")) +
-           Instance("Mount", Reference("Device", DiskPath(id, boot)) + Value("Point", "/" + id) + Value("Options", "rw" + size));
+           Instance("Mount", ReferenceTo("Device", DiskPath(id, boot)) + Value("Point", "/" + id) + Value("Options", "rw" + size));
 }
 
-std::string Rules(const std::string& elements)
+std::string RulesOf(const std::string& elements)
 {
     return "<DifftoolSpec>" + elements + "</DifftoolSpec>";
 }
@@ -61,7 +61,7 @@ std::string ExcludeOf(const std::string& cls, const std::string& property)
     return "<class name=\"" + cls + "\" default=\"include\"><excludelist><value>" + property + "</value></excludelist></class>";
 }
 
-std::string Only(const std::string& cls, const std::string& property)
+std::string IncludeOnly(const std::string& cls, const std::string& property)
 {
     return "<class name=\"" + cls + "\"><includelist><value>" + property + "</value></includelist></class>";
 }
@@ -73,17 +73,18 @@ class SelectionTest : public TClientFixture {
     void SetUp() override
     {
         TClientFixture::SetUp();
-        fBefore =
-            Scratch("before.xml",
-                    Inventory(Package("Package", "bash", "5.1", "mon") + Package("Package", "telnet", "1", "mon") +
-                              Package("Kernel", "linux", "6.1", "mon", Value("Flavour", "rt")) + DiskAt("sda", "b1", "10") +
-                              DiskAt("sdb", "b1", "20") +
-                              Instance("Owner", Value("Name", "root") + Reference("Owned", Path("Package", "Name", "bash")))));
-        fAfter = Scratch("after.xml",
-                         Inventory(Package("Package", "bash", "5.2", "tue") + Package("Package", "curl", "8", "tue") +
-                                   Package("Kernel", "linux", "6.2", "tue", Value("Flavour", "vm")) + DiskAt("sda", "b2", "10") +
-                                   DiskAt("sdb", "b2", "21") +
-                                   Instance("Owner", Value("Name", "root") + Reference("Owned", Path("Package", "Name", "curl")))));
+        fBefore = Scratch(
+            "before.xml",
+            ElementInventory(PackageOf("Package", "bash", "5.1", "mon") + PackageOf("Package", "telnet", "1", "mon") +
+                             PackageOf("Kernel", "linux", "6.1", "mon", Value("Flavour", "rt")) + DiskAt("sda", "b1", "10") +
+                             DiskAt("sdb", "b1", "20") +
+                             Instance("Owner", Value("Name", "root") + ReferenceTo("Owned", Path("Package", "Name", "bash")))));
+        fAfter = Scratch(
+            "after.xml",
+            ElementInventory(PackageOf("Package", "bash", "5.2", "tue") + PackageOf("Package", "curl", "8", "tue") +
+                             PackageOf("Kernel", "linux", "6.2", "tue", Value("Flavour", "vm")) + DiskAt("sda", "b2", "10") +
+                             DiskAt("sdb", "b2", "21") +
+                             Instance("Owner", Value("Name", "root") + ReferenceTo("Owned", Path("Package", "Name", "curl")))));
     }
 
     std::string Compare(std::vector<std::string> options)
@@ -102,7 +103,7 @@ class SelectionTest : public TClientFixture {
 
     std::string DifferencesUnder(const std::string& elements)
     {
-        return Differences({"--spec", Scratch("by-hand.xml", Rules(elements))});
+        return Differences({"--spec", Scratch("by-hand.xml", RulesOf(elements))});
     }
 
     std::string Short(const std::string& text) { return Shorten(Shorten(text, fBefore, "before.xml"), fAfter, "after.xml"); }
@@ -130,10 +131,10 @@ TEST_F(SelectionTest, OptionsMeanWhatRulesByHandMean)
                        "<value>Name</value><value>Flavour</value></excludelist></class>"},
         {{"--exclude", "Kernel.version", "--exclude", "Package.Caption"},
          kEverything + ExcludeOf("Package", "Caption") + ExcludeOf("Kernel", "Version")},
-        {{"--property", "Version"}, Only("Package", "Version")},
-        {{"--property", "Kernel.Version"}, Only("Kernel", "Version")},
-        {{"--property", "Disk.Size", "--property", "Owned"}, Only("Disk", "Size") + Only("Owner", "Owned")},
-        {{"--class", "Kernel", "--property", "Version"}, Only("Kernel", "Version")},
+        {{"--property", "Version"}, IncludeOnly("Package", "Version")},
+        {{"--property", "Kernel.Version"}, IncludeOnly("Kernel", "Version")},
+        {{"--property", "Disk.Size", "--property", "Owned"}, IncludeOnly("Disk", "Size") + IncludeOnly("Owner", "Owned")},
+        {{"--class", "Kernel", "--property", "Version"}, IncludeOnly("Kernel", "Version")},
         {{"--exclude-key", "BootId"}, "<class name=\"Disk\" excludekeys=\"BootId\"/>" + kEverything + ExcludeOf("Disk", "BootId")},
         {{"--exclude-key", "mount.device"},
          "<class name=\"Mount\" excludekeys=\"Device\"/>" + kEverything + ExcludeOf("Mount", "Device")},
@@ -151,9 +152,9 @@ TEST_F(SelectionTest, OptionsMeanWhatRulesByHandMean)
 TEST_F(SelectionTest, OptionsNarrowRules)
 {
     const std::string rules =
-        Only("Element", "Caption") + ExcludeOf("Package", "Name") +
+        IncludeOnly("Element", "Caption") + ExcludeOf("Package", "Name") +
         "<class name=\"Kernel\" default=\"exclude\"><includelist><value>Flavour</value></includelist></class>";
-    const std::string file = Scratch("rules.xml", Rules(rules));
+    const std::string file = Scratch("rules.xml", RulesOf(rules));
     const std::string narrowed = Differences({"--spec", file, "--exclude", "*.caption", "--class", "Package"});
     EXPECT_NE("", narrowed);
     EXPECT_EQ(
@@ -196,7 +197,8 @@ TEST_F(SelectionTest, SavedRulesGiveTheSameDifferences)
 {
     const std::vector<std::vector<std::string>> selections = {
         {}, {"--class", "Package"}, {"--exclude", "*.InstallDate", "--exclude-key", "BootId"}, {"--property", "*s*"}};
-    const std::string rules = Scratch("rules.xml", Rules(Include("Element") + ExcludeOf("Package", "Caption") + Include("Mount")));
+    const std::string rules =
+        Scratch("rules.xml", RulesOf(Include("Element") + ExcludeOf("Package", "Caption") + Include("Mount")));
     for (const std::string& spec : {std::string(), rules}) {
         for (std::vector<std::string> options : selections) {
             if (!spec.empty()) {
@@ -289,7 +291,7 @@ TEST_F(SelectionTest, NamesThatMeanNothingAreErrors)
 
 TEST_F(SelectionTest, APropertyThatIsNotComparedCannotBeSelected)
 {
-    const std::string rules = Scratch("rules.xml", Rules(ExcludeOf("Package", "Version")));
+    const std::string rules = Scratch("rules.xml", RulesOf(ExcludeOf("Package", "Version")));
     EXPECT_EQ("cimdelta: --property Version: is not compared in any case; cimdelta explain Package.Version says why\n",
               Complaint({"compare", fBefore, fAfter, "--spec", rules, "--property", "Version"}));
 }
@@ -370,8 +372,13 @@ TEST_F(SelectionTest, ArgumentsThatCannotBeAreErrors)
     } rows[] = {
         {{"--only", "+", "-o", "cimxml"},
          "--only cannot be used with -o cimxml, which has all records of the comparison; leave one of them out"},
+        {{"--save-rules", rules, "--accept", rules},
+         "--save-rules names a file that is written for another option too, " + rules + "; name two"},
+        {{"--only", "+", "--accept", rules},
+         "--only cannot be used with --accept, which keeps all differences, shown or not; leave one of them out"},
         {{"--save-rules", "-"}, "--save-rules writes a file, since the result goes to standard output; name a file"},
-        {{"--save-rules", rules, "--output", rules}, "--save-rules and --output name the same file, " + rules + "; name two"},
+        {{"--save-rules", rules, "--output", rules},
+         "--save-rules names a file that is written for another option too, " + rules + "; name two"},
     };
     for (const auto& row : rows) {
         std::vector<std::string> arguments{"compare", fBefore, fAfter};

@@ -16,7 +16,7 @@ struct TState {
     std::vector<std::string> logins;
 };
 
-std::string Declarations()
+std::string SystemDeclarations()
 {
     return Class("Device", "", KeyProperty("Id") + Declaration("Load", "uint32") + Declaration("Caption", "string")) +
            Class("Processor", "Device", Declaration("Speed", "uint32")) + Class("Fan", "Device", "") +
@@ -25,7 +25,7 @@ std::string Declarations()
            Class("Session", "", KeyProperty("Id")) + Class("Login", "", KeyProperty("Id"));
 }
 
-std::string Named(const std::string& cls, const std::vector<std::string>& ids)
+std::string InstancesNamed(const std::string& cls, const std::vector<std::string>& ids)
 {
     std::string all;
     for (const std::string& id : ids) {
@@ -34,9 +34,9 @@ std::string Named(const std::string& cls, const std::vector<std::string>& ids)
     return all;
 }
 
-std::string Inventory(const TState& state)
+std::string StateInventory(const TState& state)
 {
-    std::string all = System() + Declarations();
+    std::string all = System() + SystemDeclarations();
     for (const std::string id : {"cpu0", "cpu1"}) {
         all += Instance("Processor", Value("Id", id) + Value("Load", state.load, "uint32") + Value("Speed", "3000", "uint32"));
     }
@@ -47,7 +47,7 @@ std::string Inventory(const TState& state)
         all += Instance("Process", Value("Handle", process.substr(0, blank)) + Value("Name", process.substr(blank + 1)) +
                                        Value("User", "root"));
     }
-    return Document(all + Named("Session", state.sessions) + Named("Login", state.logins));
+    return Document(all + InstancesNamed("Session", state.sessions) + InstancesNamed("Login", state.logins));
 }
 
 class NoiseTest : public TClientFixture {
@@ -55,7 +55,7 @@ class NoiseTest : public TClientFixture {
     void Take(const TState& state)
     {
         const std::string name = "boot" + std::to_string(fPaths.size() + 1);
-        fPaths.push_back(name + "=" + Scratch(name + ".xml", Inventory(state)));
+        fPaths.push_back(name + "=" + Scratch(name + ".xml", StateInventory(state)));
     }
 
     void TakeThree()
@@ -157,7 +157,7 @@ TEST_F(NoiseTest, RulesThatExplainEverythingGiveNoDifferences)
 TEST_F(NoiseTest, APropertyThatSomeClassesBelowKeepIsLeftOutWhereItChanges)
 {
     Take({"b1", "5", {}, {}, {}});
-    std::string second = Inventory({"b1", "5", {}, {}, {}});
+    std::string second = StateInventory({"b1", "5", {}, {}, {}});
     const std::string fan = "<VALUE>15</VALUE>";
     second.replace(second.find(fan), fan.size(), "<VALUE>16</VALUE>");
     fPaths.push_back("boot2=" + Scratch("boot2.xml", second));
@@ -181,7 +181,7 @@ TEST_F(NoiseTest, KeysThatTellInstancesApartStay)
 TEST_F(NoiseTest, InstancesOfOtherContentsDoNotMatch)
 {
     Take({"b1", "5", {"10 init", "11 cron"}, {}, {}});
-    std::string second = Inventory({"b1", "5", {"20 init", "21 cron"}, {}, {}});
+    std::string second = StateInventory({"b1", "5", {"20 init", "21 cron"}, {}, {}});
     for (std::size_t at = second.find("<VALUE>root</VALUE>"); at != std::string::npos;
          at = second.find("<VALUE>root</VALUE>", at)) {
         second.replace(at, 19, "<VALUE>else</VALUE>");
