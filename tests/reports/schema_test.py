@@ -35,7 +35,7 @@ from small_documents import (  # noqa: E402
 
 CIMDELTA, ROOT = (pathlib.Path(sys.argv[1]).resolve(), pathlib.Path(sys.argv[2]).resolve()) if len(sys.argv) > 2 else (None, None)
 ACCEPTED = ROOT / "tests/client/data/accepted.txt" if ROOT else None
-OPTIONAL = {"sharing", "path", "madeIn", "embedded", "parts", "disagreements", "baseline"}
+OPTIONAL = {"sharing", "path", "madeIn", "embedded", "parts", "disagreements", "baseline", "notShown"}
 MAPS = {"keys", "contents", "properties"}  # names in them are those of an inventory
 WORDS = {"format", "role", "namespaceFrom", "kind", "state", "reason", "takenAs", "type"}
 
@@ -225,6 +225,10 @@ CASES = {
         [],
         None,
         [document(disk(declared("Size"), *ones)) for ones in ([value("Size", "1")], [value("Size", "2")], [value("Size", "2")])],
+    ),
+    "what options leave out": (
+        [document(disk(declared("Size") + declared("Model"), value("Size", one) + value("Model", "A"))) for one in ("1", "2")],
+        ["--exclude", "Disk.Model", "--exclude", "KALMO_OperatingSystem", "--only", "+"],
     ),
     "nothing to compare": ([TIMED, TIMED], ["--allow-empty"]),
     "no instance": ([document(SYSTEM_CLASS)] * 2, ["--allow-empty"]),
