@@ -31,8 +31,12 @@ bool IsBesideBaseline(const TBaselineOptions& options)
 }
 
 // What needs no file to be found wrong.
-void CheckOptions(const TCompareOptions& options)
+void CheckOptions(const TCompareOptions& options, const IConsole& console)
 {
+    if (options.format == EOutputFormat::kHtml && !options.isQuiet && IsStandardOutput(options.output) && console.IsTerminal()) {
+        throw TClientError(
+            "-o html writes a page for a browser, and standard output is a terminal; name a file with --output FILE");
+    }
     if (options.format == EOutputFormat::kCimXml && IsBesideBaseline(options.baseline)) {
         throw TClientError("-o cimxml writes the records of all differences, so it cannot be combined with --accept or --baseline; "
                            "choose another format");
@@ -105,7 +109,7 @@ void ShowOnly(TComparisonReport& report, const TOnlyShown& only)
 int RunCompare(const TCompareOptions& options, IConsole& console)
 {
     // Before the inventories, which may take long to load.
-    CheckOptions(options);
+    CheckOptions(options, console);
     CheckSystemNames(options.systems);
     TReferenceChoice reference = options.reference;
     reference.isMajority = options.text.showsOutliers;

@@ -12,7 +12,7 @@
 //                     "example": { "names": [ "sda" ], "reference": "500", "others": [ [ "250", 1 ] ], "short": "" },
 //                     "rule": { "what": "...", "place": "...", "xml": "..." } } ],
 //     "rules": { "name": "rules.xml", "isMade": false, "digest": "9f86...", "text": "..." },
-//     "coverage": [ "Compared: ..." ] }
+//     "baseline": [ "2 differences are new ..." ], "coverage": [ "Compared: ..." ] }
 //
 // "compared", "differences" and "instances" have a number for each inventory. The kinds are those of TDifference.
 #include "client/report/html/PageOverview.h"
@@ -23,6 +23,7 @@
 #include <boost/algorithm/string/trim.hpp>
 #include <map>
 
+#include "client/report/BaselineText.h"
 #include "client/report/DescribeAgreement.h"
 #include "client/report/DisplayLabels.h"
 #include "client/report/TInventoryNames.h"
@@ -142,13 +143,21 @@ TJson FindingsOf(const TComparisonReport& report, const TPageData& data)
     return findings;
 }
 
-TJson CoverageOf(const TComparisonReport& report)
+TJson LinesOf(std::string text)
 {
-    std::string text = WriteTextCoverage(report);
-    boost::algorithm::trim_right(text);
+    boost::algorithm::trim(text);
     std::vector<std::string> lines;
-    boost::algorithm::split(lines, text, boost::algorithm::is_any_of("\n"));
+    if (!text.empty()) {
+        boost::algorithm::split(lines, text, boost::algorithm::is_any_of("\n"));
+    }
     return lines;
+}
+
+TJson BaselineOf(const TComparisonReport& report)
+{
+    TTextOptions options;
+    options.isDetailed = true;
+    return LinesOf(WriteBaselineText(report, options));
 }
 
 }  // namespace
@@ -168,7 +177,8 @@ TJson MakePageOverview(const TComparisonReport& report, const TPageData& data)
                          {"isMade", report.areRulesMade},
                          {"digest", Sha256Hex(report.rulesText)},
                          {"text", report.areRulesMade ? std::string() : report.rulesText}};
-    overview["coverage"] = CoverageOf(report);
+    overview["baseline"] = BaselineOf(report);
+    overview["coverage"] = LinesOf(WriteTextCoverage(report));
     return overview;
 }
 

@@ -19,20 +19,17 @@ std::string CutForLine(const std::string& text)
     return start.size() == text.size() ? text : std::string(start) + "...";
 }
 
-std::uint32_t TPageChanges::Add(const TValueDifference& change, bool hasReference)
+std::uint32_t TPageChanges::Add(const TValueDifference& change, bool hasReference, const TValueWords& words)
 {
     TPageColumns& columns = fData.columns;
-    const TValueTexts texts(change, hasReference);
-    const std::string reference = hasReference ? texts.GetReference() : std::string();
-    const std::string shortText =
-        hasReference && change.others.size() == 1 ? ShortText(change, reference, texts.GetOther(0)) : std::string();
+    const std::vector<std::string> texts = TextsOf(change, hasReference, words);
     const std::size_t number = columns.GetCount(TPageColumns::kChangeReference);
-    columns.Add(TPageColumns::kChangeReference, fData.texts.Add(reference));
-    columns.Add(TPageColumns::kChangeShort, fData.texts.Add(shortText));
+    columns.Add(TPageColumns::kChangeReference, fData.texts.Add(texts.front()));
+    columns.Add(TPageColumns::kChangeShort, fData.texts.Add(hasReference ? ShortText(change, words, texts) : std::string()));
     columns.Add(TPageColumns::kChangeGroups, columns.GetCount(TPageColumns::kGroupValue));
     for (std::size_t i = 0; i < change.others.size(); ++i) {
         const TValueDifference::TGroup& group = change.others[i];
-        columns.Add(TPageColumns::kGroupValue, fData.texts.Add(texts.GetOther(i)));
+        columns.Add(TPageColumns::kGroupValue, fData.texts.Add(texts[i + 1]));
         columns.Add(TPageColumns::kGroupSet, fData.sets.Add(group.inventories));
         columns.Add(TPageColumns::kGroupCounts, AddList(group.instances));
     }
@@ -56,23 +53,48 @@ std::uint32_t TPageChanges::AddList(const std::vector<std::size_t>& numbers)
     return static_cast<std::uint32_t>(list);
 }
 
-void TPageChanges::Describe(const TValueDifference& change, TPageFinding::TExample& example)
+void TPageChanges::Describe(const TValueDifference& change, const TValueWords& words, TPageFinding::TExample& example)
 {
-    const TValueTexts texts(change, true);
-    example.reference = CutForLine(texts.GetReference());
+    const std::vector<std::string> texts = TextsOf(change, true, words);
+    example.reference = CutForLine(texts.front());
     for (std::size_t i = 0; i < change.others.size(); ++i) {
-        example.others.emplace_back(CutForLine(texts.GetOther(i)), fData.sets.Add(change.others[i].inventories));
+        example.others.emplace_back(CutForLine(texts[i + 1]), fData.sets.Add(change.others[i].inventories));
     }
-    if (change.others.size() == 1) {
-        example.shortText = CutForLine(ShortText(change, texts.GetReference(), texts.GetOther(0)));
+    example.shortText = CutForLine(ShortText(change, words, texts));
+}
+
+// Values of different types are shown with their types, not in words: they might look alike.
+std::vector<std::string> TPageChanges::TextsOf(const TValueDifference& change, bool hasReference, const TValueWords& words)
+{
+    const TValueTexts plain(change, hasReference);
+    bool areOfOneType = true;
+    for (const TValueDifference::TGroup& group : change.others) {
+        areOfOneType =
+            areOfOneType && group.value.GetType() == (hasReference ? change.reference : change.others.front().value).GetType();
     }
+    const auto text = [&words, areOfOneType](const TCIMValue& value, const std::string& otherwise) {
+        const std::string described = areOfOneType ? words.Describe(value) : std::string();
+        return described.empty() ? otherwise : described;
+    };
+    std::vector<std::string> texts = {hasReference ? text(change.reference, plain.GetReference()) : std::string()};
+    for (std::size_t i = 0; i < change.others.size(); ++i) {
+        texts.push_back(text(change.others[i].value, plain.GetOther(i)));
+    }
+    return texts;
 }
 
 // The words of the text report, if they say it in less than both values.
-std::string TPageChanges::ShortText(const TValueDifference& change, const std::string& reference, const std::string& other) const
+std::string TPageChanges::ShortText(const TValueDifference& change, const TValueWords& words,
+                                    const std::vector<std::string>& texts) const
 {
-    const std::string text = ChangeText(change, fNames, true);
-    return text.size() < reference.size() + other.size() ? text : std::string();
+    if (change.others.size() != 1) {
+        return std::string();
+    }
+    TChangeStyle style;
+    style.isPair = true;
+    style.words = words;
+    const std::string text = ChangeText(change, fNames, style);
+    return text.size() < texts[0].size() + texts[1].size() ? text : std::string();
 }
 
 }  // namespace NORVZEL20

@@ -7,6 +7,7 @@
 #include "client/comparison/TValueDifference.h"
 #include "client/report/TInventoryNames.h"
 #include "client/report/html/TPageData.h"
+#include "client/text/TValueWords.h"
 
 namespace NORVZEL20 {
 
@@ -17,14 +18,16 @@ class TPageChanges {
     TPageChanges(TPageData& data, const std::vector<std::string>& labels) : fData(data), fNames(labels) {}
 
     /// Adds a change and returns its number. Without `hasReference`, the reference lacks the instance.
-    std::uint32_t Add(const TValueDifference& change, bool hasReference);
+    std::uint32_t Add(const TValueDifference& change, bool hasReference, const TValueWords& words);
     /// Adds a list of numbers and returns its number; 0 is the empty list.
     std::uint32_t AddList(const std::vector<std::size_t>& numbers);
     /// What is shown of the change before the rows are unpacked.
-    void Describe(const TValueDifference& change, TPageFinding::TExample& example);
+    void Describe(const TValueDifference& change, const TValueWords& words, TPageFinding::TExample& example);
 
   private:
-    std::string ShortText(const TValueDifference& change, const std::string& reference, const std::string& other) const;
+    // The texts of the values, the reference's first.
+    static std::vector<std::string> TextsOf(const TValueDifference& change, bool hasReference, const TValueWords& words);
+    std::string ShortText(const TValueDifference& change, const TValueWords& words, const std::vector<std::string>& texts) const;
 
     TPageData& fData;
     const TInventoryNames fNames;

@@ -5,6 +5,7 @@
 #include <utility>
 
 #include "client/findings/ChangeIdentity.h"
+#include "client/findings/DeclaredWords.h"
 #include "client/text/DisplayText.h"
 #include "client/text/EmbeddedText.h"
 
@@ -31,7 +32,8 @@ bool SharesKeys(const TDifference& difference)
 }  // namespace
 
 TPageClassRows::TPageClassRows(const TComparisonReport& report, TShortNames& names, TPageData& data, const std::string& className)
-    : fNames(names), fData(data), fChanges(data, report.labels), fInventories(report.labels.size())
+    : fNames(names), fData(data), fChanges(data, report.labels), fReportInventories(*report.inventories),
+      fInventories(report.labels.size())
 {
     fClass.name = className;
     fClass.differences.assign(fInventories, 0);
@@ -121,9 +123,9 @@ void TPageClassRows::AddChange(const TDifference& difference, const TValueDiffer
     const auto [known, isNew] = finding.positions.emplace(WholeText(change), finding.changes.size());
     if (isNew) {
         if (finding.changes.empty()) {
-            fChanges.Describe(change, finding.page.example);
+            fChanges.Describe(change, WordsFor(change.property), finding.page.example);
         }
-        finding.changes.push_back({fChanges.Add(change, true), 0, FewestIn(change)});
+        finding.changes.push_back({fChanges.Add(change, true, WordsFor(change.property)), 0, FewestIn(change)});
     }
     ++finding.changes[known->second].rows;
     AddRow(finding, difference, inventories, known->second, number);
@@ -147,7 +149,8 @@ std::size_t TPageClassRows::AddContents(const TDifference& difference, TPageFind
     columns.Add(TPageColumns::kContentPairs, columns.GetCount(TPageColumns::kPairProperty));
     columns.Add(TPageColumns::kContentDisagreements, columns.GetCount(TPageColumns::kDisagreementProperty));
     for (const auto& [property, value] : difference.contents) {
-        const std::string text = DisplayContents(value);
+        const std::string words = WordsFor(property).Describe(value);
+        const std::string text = words.empty() ? DisplayContents(value) : words;
         columns.Add(TPageColumns::kPairProperty, fData.texts.Add(EscapeForDisplay(property)));
         columns.Add(TPageColumns::kPairValue, fData.texts.Add(text));
         if (isExample) {
@@ -162,8 +165,15 @@ void TPageClassRows::AddDisagreements(const TDifference& difference)
 {
     for (const TValueDifference& values : difference.values) {
         fData.columns.Add(TPageColumns::kDisagreementProperty, fData.texts.Add(EscapeForDisplay(values.property)));
-        fData.columns.Add(TPageColumns::kDisagreementChange, fChanges.Add(values, false));
+        fData.columns.Add(TPageColumns::kDisagreementChange, fChanges.Add(values, false, WordsFor(values.property)));
     }
+}
+
+const TValueWords& TPageClassRows::WordsFor(const std::string& property)
+{
+    const auto known = fWords.find(property);
+    return known != fWords.end() ? known->second
+                                 : fWords.emplace(property, DeclaredWords(fReportInventories, fClass.name, property)).first->second;
 }
 
 void TPageClassRows::Write()

@@ -69,13 +69,16 @@ class TPageClassRows {
     void AddRow(TFinding& finding, const TDifference& difference, const std::vector<std::size_t>& inventories, std::size_t content,
                 std::size_t number);
     void WriteFinding(TFinding& finding, std::size_t firstInstance);
+    const TValueWords& WordsFor(const std::string& property);
     std::size_t Rarity(const TFinding& finding) const;
 
     TShortNames& fNames;
     TPageData& fData;
     TPageChanges fChanges;
     TPageClass fClass;
+    const std::vector<TInventory>& fReportInventories;
     const std::size_t fInventories;
+    std::map<std::string, TValueWords> fWords;  // by property
     std::vector<TFinding> fPresences;
     std::map<std::pair<std::string, std::vector<std::size_t>>, TFinding> fProperties;  // by name and inventories
     std::vector<TInstance> fInstances;

@@ -74,7 +74,8 @@ TRuleProposals::TProposal TRuleProposals::LeaveOutProperty(const std::string& cl
     const std::string property = path.substr(0, path.find('.'));
     const std::string what = "Leaves " + property + " of " + className + " out, and of the classes below it.";
     if (!fTrace) {
-        return {what, "It is a whole file: compare with --spec FILE.", WholeFile(ElementWith(className, TCIMDiffEngine::INCLUDE, {property}))};
+        return {what, "It is a whole file: compare with --spec FILE.",
+                WholeFile(ElementWith(className, TCIMDiffEngine::INCLUDE, {property}))};
     }
     const TRuleTrace::TDecision decision = fTrace->Decide(className, property);
     const std::string added = ElementWith(className, fTrace->Find(className).byDefault.treatment, {property});
@@ -103,7 +104,8 @@ TRuleProposals::TProposal TRuleProposals::LeaveOutClass(const std::string& class
     const std::string what =
         "Rules cannot leave out single instances; this leaves out all of " + className + ", and of the classes below it.";
     if (!fTrace) {
-        return {what, "It is a whole file: compare with --spec FILE.", WholeFile(ElementWith(className, TCIMDiffEngine::EXCLUDE, {}))};
+        return {what, "It is a whole file: compare with --spec FILE.",
+                WholeFile(ElementWith(className, TCIMDiffEngine::EXCLUDE, {}))};
     }
     const TElements own = ElementsOf(className);
     if (!own.empty()) {

@@ -218,6 +218,12 @@ function drawRules(overview) {
     }
 }
 
+// What a baseline accepts, if there is one.
+function drawBaseline(overview) {
+    byId("baseline").hidden = overview.baseline.length === 0;
+    byId("baseline-text").textContent = overview.baseline.join("\n");
+}
+
 function drawCoverage(overview) {
     for (const line of overview.coverage) {
         byId("coverage-text").append(element("li", {}, line));

@@ -28,6 +28,7 @@ async function start() {
     const matrix = new Matrix(overview, byId("matrix-table"), (choice) => filters.choose(choice));
     drawInventories(overview);
     drawRules(overview);
+    drawBaseline(overview);
     drawCoverage(overview);
     listenToKeys(byId("list"), findings);
     listenToPrinting(findings);

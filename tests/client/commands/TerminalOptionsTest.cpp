@@ -47,6 +47,15 @@ TEST_F(TerminalOptionsTest, ASummaryIsForTextAndHasNoDetail)
               Complaint({"compare", "--summary", "--detail", "web01.xml", "web02.xml"}));
 }
 
+TEST_F(TerminalOptionsTest, APageIsNotForATerminal)
+{
+    fTerminal = true;
+    EXPECT_EQ("cimdelta: -o html writes a page for a browser, and standard output is a terminal; name a file with --output FILE\n",
+              Complaint({"compare", "-o", "html", "web01.xml", "web02.xml"}));
+    fTerminal = false;
+    EXPECT_EQ(0u, Result({"compare", "-o", "html", "web01.xml", "web02.xml"}).find("<!DOCTYPE html>"));
+}
+
 TEST_F(TerminalOptionsTest, QuietHasTheStatusAlone)
 {
     for (const char* const option : {"-q", "--quiet"}) {
