@@ -54,7 +54,7 @@ TEST_F(CollectCommandTest, WrongOptionsAreRefusedBeforeAnythingIsRead)
          "units, kernel, users, jobs, sockets, files or certificates\n"},
         {{"collect", "-o", none.c_str()}, "cimdelta: " + none + ": cannot be written: No such file or directory\n"},
         {{"collect", "web01.xml"}, "cimdelta: web01.xml is one argument too many; see cimdelta collect --help\n"},
-        {{"collect", "--only", ""}, "cimdelta: --only must not be empty; see cimdelta collect --help\n"},
+        {{"collect", "--only", ""}, "cimdelta: --only: must not be empty; see cimdelta collect --help\n"},
     };
     for (const auto& row : rows) {
         EXPECT_EQ(row.message, Run(row.arguments));

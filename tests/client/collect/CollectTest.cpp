@@ -31,9 +31,10 @@ TEST_F(CollectTest, EachChangeIsFoundAlone)
          "KALMO_Unit               ~ ssh.service.UnitFileState: enabled -> disabled\n"},
         {[](TMadeSystem& system) {
              system.Append("/etc/passwd", "eve:x:1001:4::/:/bin/sh\n");
-             system.File("/etc/subuid", "eve:100000:65536\n");
+             system.Append("/etc/subuid", "eve:100000:65536\n");
          },
-         "KALMO_User  + eve   UserID 1001, GroupID 4, HomeDirectory /, LoginShell /bin/sh\n"},
+         "KALMO_User  + eve   UserID 1001, GroupID 4, HomeDirectory /, LoginShell /bin/sh, SubordinateUserIDs {100000:65536}, "
+         "...\n"},
         {[](TMadeSystem& system) {
              system.File("/proc/self/mountinfo", "25 1 8:1 / / rw,noatime shared:1 - ext4 /dev/sda1 rw\n"
                                                  "30 25 0:26 / /srv rw,noexec - nfs4 nas:/srv rw\n");

@@ -13,8 +13,9 @@ class KindsTest : public TCollectFixture {
     /// The instances of a class, a line each: the values of those properties that are not NULL.
     std::string Lines(const std::string& className)
     {
+        const std::string shown = Show(className);
         std::string text;
-        for (const std::string_view line : SplitAt(Show(className), '\n')) {
+        for (const std::string_view line : SplitAt(shown, '\n')) {
             if (StartsWith(line, "KALMO_")) {
                 text += text.empty() ? "" : "\n";
             } else if (StartsWith(line, "    ") && !EndsWith(line, ": NULL")) {

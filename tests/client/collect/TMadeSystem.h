@@ -24,6 +24,8 @@ class TMadeSystem {
         // Whoever runs the tests owns the files.
         File("/etc/passwd", "root:x:" + std::to_string(getuid()) + ":0:root:/root:/bin/bash\nweb:x:1000:1000::/home/web:/bin/sh\n");
         File("/etc/group", "root:x:" + std::to_string(getgid()) + ":\nadm:x:4:web\nweb:x:1000:\n");
+        File("/etc/subuid", "");
+        File("/srv/.keep", "");
         File("/etc/os-release", "PRETTY_NAME=\"Debian GNU/Linux 12 (bookworm)\"\nID=debian\nVERSION_ID=\"12\"\n");
         File("/etc/ssh/sshd_config", "Port 22\n");
         File("/etc/shadow", "root:*:1::::::\n", 0640);
