@@ -12,11 +12,14 @@ void AddKinds(CLI::App* command, const char* name, std::vector<std::string>& kin
     AddText(command, name, kinds, description.c_str())->delimiter(',')->allow_extra_args(false)->option_text("KIND[,KIND...]");
 }
 
+// In lines that fit the help.
 std::string AllKinds()
 {
+    constexpr std::size_t kInALine = 8;
     std::string list;
-    for (const std::string& kind : CollectedKinds()) {
-        list += (list.empty() ? "" : ", ") + kind;
+    const std::vector<std::string> kinds = CollectedKinds();
+    for (std::size_t i = 0; i < kinds.size(); ++i) {
+        list += (i == 0 ? "" : ",") + std::string(i > 0 && i % kInALine == 0 ? "\n" : " ") + kinds[i];
     }
     return list;
 }
@@ -29,15 +32,15 @@ void AddCollectOptions(CLI::App* command, TCollectOptions& options)
             "write the inventory to this file, whole or not at all (default: standard output); the other commands\n"
             "have -o for the format, which is always CIM-XML here")
         ->option_text("FILE");
-    AddKinds(command, "--only", options.collection.only, "collect these kinds alone: " + AllKinds());
+    AddKinds(command, "--only", options.collection.only, "collect these kinds alone:" + AllKinds());
     AddKinds(command, "--skip", options.collection.skipped, "do not collect these kinds");
-    AddText(
-        command, "--exclude", options.collection.excluded,
-        "leave out configuration files and certificates in files whose paths match this shell pattern; the option may be repeated")
+    AddText(command, "--exclude", options.collection.excluded,
+            "leave out configuration files and certificates in files whose paths match this shell pattern; the option may\n"
+            "be repeated")
         ->allow_extra_args(false)
         ->option_text("PATTERN");
     command->add_flag("--root-files", options.collection.hasRootFiles,
-                      "include configuration files that only root may read, except those that hold keys or passwords");
+                      "read configuration files that not everybody may read too, except those that may hold keys or passwords");
 }
 
 }  // namespace NORVZEL20

@@ -111,7 +111,7 @@ class TConfigurationFiles {
         fCollection.Add(facts);
         const mode_t needed = S_IROTH | S_IXOTH;
         if (S_ISDIR(status.st_mode) && (status.st_mode & needed) != needed && !fCollection.GetOptions().hasRootFiles) {
-            fCollection.LeaveOut(path, kForRoot);
+            fCollection.LeaveOut(path, kForRoot, kForRootAdvice);
             return false;
         }
         return true;
@@ -120,6 +120,7 @@ class TConfigurationFiles {
   private:
     using TNames = std::map<std::string, std::string>;
     static constexpr char kForRoot[] = "only root may read it";
+    static constexpr char kForRootAdvice[] = "as root, --root-files includes it";
 
     TNames NamesByNumber(const std::string& path, TCollection::TReader reader, const char* number) const
     {
@@ -144,15 +145,16 @@ class TConfigurationFiles {
             return;
         }
         std::string trouble;
+        const bool isForRoot = !HoldsSecrets(path) && (status.st_mode & S_IROTH) == 0 && !fCollection.GetOptions().hasRootFiles;
         if (HoldsSecrets(path)) {
             trouble = kSecretReason;
-        } else if ((status.st_mode & S_IROTH) == 0 && !fCollection.GetOptions().hasRootFiles) {
+        } else if (isForRoot) {
             trouble = kForRoot;
         } else if (const std::string digest = DigestFile(fCollection.GetRoot(), path, trouble); !digest.empty()) {
             facts.Text("Digest", digest);
         }
         if (!trouble.empty()) {
-            fCollection.LeaveOut(path, trouble);
+            fCollection.LeaveOut(path, trouble, isForRoot ? kForRootAdvice : "");
         }
     }
 

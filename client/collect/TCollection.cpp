@@ -44,9 +44,9 @@ void TCollection::AddAll(const std::vector<TFacts>& all)
     }
 }
 
-void TCollection::LeaveOut(const std::string& subject, const std::string& reason)
+void TCollection::LeaveOut(const std::string& subject, const std::string& reason, const std::string& advice)
 {
-    fOmissions.Add(fKind, ValidText(reason), ValidText(subject));
+    fOmissions.Add(fKind, ValidText(reason), ValidText(subject), advice);
 }
 
 void TCollection::LeaveOutLines(const std::string& path, const TReadFaults& faults)

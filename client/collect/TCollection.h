@@ -41,8 +41,8 @@ class TCollection {
     void Add(const TFacts& facts);
     void AddAll(const std::vector<TFacts>& all);
 
-    /// Notes that something of the current kind is not collected.
-    void LeaveOut(const std::string& subject, const std::string& reason);
+    /// Notes that something of the current kind is not collected, and what a person can do about it.
+    void LeaveOut(const std::string& subject, const std::string& reason, const std::string& advice = std::string());
     /// Notes lines of a file that could not be taken.
     void LeaveOutLines(const std::string& path, const TReadFaults& faults);
 

@@ -2,10 +2,11 @@
 
 namespace NORVZEL20 {
 
-void TOmissions::Add(const std::string& kind, const std::string& reason, const std::string& subject)
+void TOmissions::Add(const std::string& kind, const std::string& reason, const std::string& subject, const std::string& advice)
 {
     TSubjects& subjects = fSubjects[{kind, reason}];
     ++subjects.count;
+    subjects.advice = advice;
     if (subjects.named.size() < kMostSubjects) {
         subjects.named.push_back(subject);
     }
@@ -40,7 +41,8 @@ std::vector<std::string> TOmissions::MakeLines() const
     std::vector<std::string> lines;
     std::string kind;
     for (const auto& [key, subjects] : fSubjects) {
-        const std::string text = Describe(subjects) + ": " + key.second;
+        const std::string text =
+            Describe(subjects) + ": " + key.second + (subjects.advice.empty() ? "" : " (" + subjects.advice + ")");
         if (lines.empty() || key.first != kind) {
             lines.push_back("not collected: " + key.first + ": " + text);
         } else {

@@ -15,8 +15,10 @@ class TOmissions {
   public:
     static constexpr std::size_t kMostSubjects = 20;  ///< that are named; the others are counted
 
-    /// Notes that `subject`, such as a path, was not collected.
-    void Add(const std::string& kind, const std::string& reason, const std::string& subject);
+    /// Notes that `subject`, such as a path, was not collected. `advice` is what a person can do about it; it is for the lines
+    /// alone.
+    void Add(const std::string& kind, const std::string& reason, const std::string& subject,
+             const std::string& advice = std::string());
 
     /// An instance of KALMO_NotCollected for each kind and reason, in the order of their names.
     std::vector<TFacts> MakeFacts() const;
@@ -28,6 +30,7 @@ class TOmissions {
     struct TSubjects {
         std::size_t count = 0;
         std::vector<std::string> named;
+        std::string advice;
     };
 
     static std::string Describe(const TSubjects& subjects);

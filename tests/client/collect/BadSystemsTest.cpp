@@ -123,7 +123,9 @@ TEST_F(BadSystemsTest, FilesForRootAreReadIfAskedFor)
 {
     fSystem->File("/etc/sudoers", "root ALL\n", 0440).File("/etc/app/x.conf", "x\n");
     ASSERT_EQ(0, chmod(fSystem->Place("/etc/app").c_str(), 0750));
-    EXPECT_EQ("/etc/shadow: it may hold keys or passwords; /etc/app, /etc/sudoers: only root may read it\n", LinesAbout("files"));
+    EXPECT_EQ("/etc/shadow: it may hold keys or passwords; /etc/app, /etc/sudoers: only root may read it (as root, --root-files "
+              "includes it)\n",
+              LinesAbout("files"));
     TCollectionOptions options;
     options.hasRootFiles = true;
     EXPECT_EQ("/etc/shadow: it may hold keys or passwords\n", LinesAbout("files", options));
