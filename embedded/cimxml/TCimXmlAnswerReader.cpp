@@ -1,12 +1,11 @@
 #include "embedded/cimxml/TCimXmlAnswerReader.h"
 
-#include <array>
 #include <map>
 #include <string>
 
+#include "embedded/cimxml/DescribeCimStatus.h"
 #include "embedded/load/MessageText.h"
 #include "embedded/value/TNameText.h"
-#include "embedded/value/TValueText.h"
 
 namespace NORVZEL20 {
 
@@ -14,48 +13,6 @@ namespace {
 
 using EStatus = TZELStatusCode::EStatusCode;
 using TElement = TCimXmlElement;
-
-/// What a status that a server answers with is called (DSP0200). Numbers without a name were never assigned.
-constexpr std::array<const char*, 29> kStatusNames = {"",
-                                                      "CIM_ERR_FAILED",
-                                                      "CIM_ERR_ACCESS_DENIED",
-                                                      "CIM_ERR_INVALID_NAMESPACE",
-                                                      "CIM_ERR_INVALID_PARAMETER",
-                                                      "CIM_ERR_INVALID_CLASS",
-                                                      "CIM_ERR_NOT_FOUND",
-                                                      "CIM_ERR_NOT_SUPPORTED",
-                                                      "CIM_ERR_CLASS_HAS_CHILDREN",
-                                                      "CIM_ERR_CLASS_HAS_INSTANCES",
-                                                      "CIM_ERR_INVALID_SUPERCLASS",
-                                                      "CIM_ERR_ALREADY_EXISTS",
-                                                      "CIM_ERR_NO_SUCH_PROPERTY",
-                                                      "CIM_ERR_TYPE_MISMATCH",
-                                                      "CIM_ERR_QUERY_LANGUAGE_NOT_SUPPORTED",
-                                                      "CIM_ERR_INVALID_QUERY",
-                                                      "CIM_ERR_METHOD_NOT_AVAILABLE",
-                                                      "CIM_ERR_METHOD_NOT_FOUND",
-                                                      "",
-                                                      "",
-                                                      "CIM_ERR_NAMESPACE_NOT_EMPTY",
-                                                      "CIM_ERR_INVALID_ENUMERATION_CONTEXT",
-                                                      "CIM_ERR_INVALID_OPERATION_TIMEOUT",
-                                                      "CIM_ERR_PULL_HAS_BEEN_ABANDONED",
-                                                      "CIM_ERR_PULL_CANNOT_BE_ABANDONED",
-                                                      "CIM_ERR_FILTERED_ENUMERATION_NOT_SUPPORTED",
-                                                      "CIM_ERR_CONTINUATION_ON_ERROR_NOT_SUPPORTED",
-                                                      "CIM_ERR_SERVER_LIMITS_EXCEEDED",
-                                                      "CIM_ERR_SERVER_IS_SHUTTING_DOWN"};
-
-/// "CIM_ERR_NOT_FOUND (6)"; for an unknown number, or something else than a number, that alone.
-std::string DescribeStatus(const char* code)
-{
-    TCIMValue number;
-    const bool isNumber = TValueText::Parse(TCIMValue::TCIMType::kUint32, code, number);
-    if (!isNumber || number.GetUnsigned() >= kStatusNames.size() || *kStatusNames[number.GetUnsigned()] == '\0') {
-        return "status " + Quote(code);
-    }
-    return std::string(kStatusNames[number.GetUnsigned()]) + " (" + code + ")";
-}
 
 /// What can be done about a status that a server answers with, by its number.
 const char* AdviseOnStatus(const std::string& code)
@@ -121,8 +78,8 @@ void TCimXmlAnswerReader::Skip(const TCimXmlAttributes& attributes)
 void TCimXmlAnswerReader::RefuseError(const TCimXmlAttributes& attributes) const
 {
     const std::string to = fOperation.empty() ? "" : " to " + Quote(fOperation);
-    fContext.Fail(EStatus::kParseError, "found an error as the answer" + to + ": " + DescribeStatus(attributes.Get("CODE")) + ", " +
-                                            Quote(attributes.Get("DESCRIPTION")) + "; expected an answer with objects; " +
+    fContext.Fail(EStatus::kParseError, "found an error as the answer" + to + ": " + DescribeCimStatus(attributes.Get("CODE")) +
+                                            ", " + Quote(attributes.Get("DESCRIPTION")) + "; expected an answer with objects; " +
                                             AdviseOnStatus(attributes.Get("CODE")));
 }
 
