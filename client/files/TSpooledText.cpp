@@ -79,13 +79,32 @@ void TSpooledText::ReadFile(const TCallback& callback) const
 {
     std::array<char, kReadAtOnce> buffer;
     for (std::uint64_t at = 0; at < fInFile;) {
-        const std::size_t most = static_cast<std::size_t>(std::min<std::uint64_t>(buffer.size(), fInFile - at));
-        const ssize_t count = pread(fDescriptor, buffer.data(), most, static_cast<off_t>(at));
-        const std::error_code reason = count == 0 ? std::make_error_code(std::errc::io_error) : LastSystemError();
+        const std::size_t count = ReadFileAt(at, buffer.data(), buffer.size());
+        callback(std::string_view(buffer.data(), count));
+        at += count;
+    }
+}
+
+std::size_t TSpooledText::ReadAt(std::uint64_t place, char* buffer, std::size_t size) const
+{
+    if (place < fInFile && size > 0) {
+        return ReadFileAt(place, buffer, size);
+    }
+    const std::uint64_t inTail = place - fInFile;
+    return inTail < fTail.size() ? fTail.copy(buffer, size, static_cast<std::size_t>(inTail)) : 0;
+}
+
+// `place` is in the file. At least one byte.
+std::size_t TSpooledText::ReadFileAt(std::uint64_t place, char* buffer, std::size_t size) const
+{
+    const std::size_t most = static_cast<std::size_t>(std::min<std::uint64_t>(size, fInFile - place));
+    for (;;) {
+        const ssize_t count = pread(fDescriptor, buffer, most, static_cast<off_t>(place));
         if (count > 0) {
-            callback(std::string_view(buffer.data(), static_cast<std::size_t>(count)));
-            at += static_cast<std::uint64_t>(count);
-        } else if (reason != std::errc::interrupted) {
+            return static_cast<std::size_t>(count);
+        }
+        const std::error_code reason = count == 0 ? std::make_error_code(std::errc::io_error) : LastSystemError();
+        if (reason != std::errc::interrupted) {
             throw TClientError("the temporary file of the result cannot be read", reason);
         }
     }

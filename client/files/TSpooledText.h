@@ -30,9 +30,14 @@ class TSpooledText {
     /// Calls back with the whole text, piece by piece. Errors: TClientError if the file cannot be read; what the callback throws.
     void ForEachPiece(const TCallback& callback) const;
 
+    /// Copies at most `size` bytes of the text from that place on, and returns how many; 0 means its end or a size of 0. Errors:
+    /// TClientError if the file cannot be read.
+    std::size_t ReadAt(std::uint64_t place, char* buffer, std::size_t size) const;
+
   private:
     void MoveToFile() noexcept;
     void ReadFile(const TCallback& callback) const;
+    std::size_t ReadFileAt(std::uint64_t place, char* buffer, std::size_t size) const;
 
     std::string fTail;           // what is behind the text in the file
     std::uint64_t fInFile = 0;   // the length of the text in the file; more may be there, of a piece that did not fit
