@@ -2,10 +2,22 @@
 
 #include "client/CommandLine.h"
 #include "client/files/TUnfinishedFile.h"
+#include "client/process/AskOnTerminal.h"
 #include "client/process/EndingSignals.h"
 #include "client/process/LackOfMemory.h"
 #include "client/process/StandardDescriptors.h"
 #include "client/process/TStandardConsole.h"
+
+namespace {
+
+// Leaves nothing behind when the process ends early.
+void CleanUp()
+{
+    NORVZEL20::TUnfinishedFile::RemoveAll();
+    NORVZEL20::ShowTypingAgain();
+}
+
+}  // namespace
 
 int main(int argc, char** argv)
 {
@@ -13,8 +25,8 @@ int main(int argc, char** argv)
     std::signal(SIGPIPE, SIG_IGN);
     std::signal(SIGXFSZ, SIG_IGN);
     NORVZEL20::ReserveStandardDescriptors();
-    NORVZEL20::CleanUpOnEndingSignals(&NORVZEL20::TUnfinishedFile::RemoveAll);
-    NORVZEL20::EndInOrderWithoutMemory(&NORVZEL20::TUnfinishedFile::RemoveAll);
+    NORVZEL20::CleanUpOnEndingSignals(&CleanUp);
+    NORVZEL20::EndInOrderWithoutMemory(&CleanUp);
     NORVZEL20::TStandardConsole console;
     return NORVZEL20::RunClient(argc, argv, console);
 }
