@@ -70,6 +70,7 @@ TTextOptions TextOptions(const TCompareOptions& options, const IConsole& console
     if (const std::size_t width = isOnConsole ? console.GetWidth() : 0; width > 0) {
         text.width = std::max(width, kLeastWidth);
     }
+    text.hasWholeGroups = !options.selection.properties.empty();
     if (text.mostLines == 0 && isOnConsole && console.IsTerminal()) {
         text.mostLines = kMostLinesOnTerminal;
     }

@@ -181,6 +181,11 @@ TEST_F(GroupedReportTest, SmallGroupsAreWholeAndLargeOnesSayHowManyThereAre)
     EXPECT_EQ("Package  ~ Version in 9 instances, 9 distinct changes\n"
               "           p1: 1-1 -> 2-1   ... 8 more (--property Version)\n",
               Findings());
+    std::string whole;
+    for (const std::string number : {"1", "2", "3", "4", "5", "6", "7", "8", "9"}) {
+        whole += (whole.empty() ? "Package  ~ p" : "         ~ p") + number + ".Version: 1-" + number + " -> 2-" + number + "\n";
+    }
+    EXPECT_EQ(whole, Findings({"--property", "Version"}));
     fSystems.pop_back();
     System("d", "");
     EXPECT_EQ("Package  - 9 instances: p1, p2, p3, p4, p5, p6, p7, p8, ... 1 more (--detail)\n", Findings());
@@ -480,7 +485,7 @@ TEST_F(EightServersTest, AreReadFromTheOddestOn)
               "    s0.Mode: 1 -> 2 (web07)\n"
               "    s1.Mode: 1 -> 3 (web07)\n"
               "    s2.Mode: 1 -> 4 (web07)\n"
-                            "KALMO_User            ~1   www.Shell: sh -> zsh (web21..23)\n",
+              "KALMO_User            ~1   www.Shell: sh -> zsh (web21..23)\n",
               Findings().substr(Findings().find("KALMO_Service")));
 }
 
