@@ -67,6 +67,7 @@ TComparisonReport SeeFromMajority(const TComparisonReport& report)
     seen.inventories = seen.majority.get();
     seen.run = std::make_shared<const TComparisonReport>(report);
     seen.differences = std::make_shared<TMajorityView>(report.differences, *report.inventories, report.coverage);
+    seen.allDifferences = seen.differences;
     return seen;
 }
 

@@ -152,6 +152,7 @@ TComparisonReport TComparison::RunWith(const std::shared_ptr<TRules>& rules)
     report.records->SetSpecFileName(file.GetPath());
     FindDifferences(*report.records, *rules);
     report.differences = std::make_shared<TDifferenceList>(fInventories, rules, *report.records);
+    report.allDifferences = report.differences;
     return report;
 }
 

@@ -28,11 +28,12 @@ struct TComparisonReport {
     std::shared_ptr<TRules> meaning;  ///< the rules of the run, options included
     TCoverage coverage;
     std::vector<std::string> idleRules;  ///< the classes that a rules file names although no inventory has instances of their trees
-    const std::vector<TInventory>* inventories;  ///< those that were compared; they must outlive this
-    boost::shared_ptr<TDeltaNamespace> records;  ///< the delta namespace of the run
-    std::shared_ptr<IDifferences> differences;   ///< what the records stand for; reads the inventories
-    std::optional<TBaselineOutcome> baseline;    ///< if `differences` are what a baseline does not accept
-    TNotShown notShown;                          ///< the differences of the run that `differences` leaves out
+    const std::vector<TInventory>* inventories;    ///< those that were compared; they must outlive this
+    boost::shared_ptr<TDeltaNamespace> records;    ///< the delta namespace of the run
+    std::shared_ptr<IDifferences> differences;     ///< what the records stand for; reads the inventories
+    std::shared_ptr<IDifferences> allDifferences;  ///< the same with those that a baseline or an option leaves out
+    std::optional<TBaselineOutcome> baseline;      ///< if `differences` are what a baseline does not accept
+    TNotShown notShown;                            ///< the differences of the run that `differences` leaves out
     /// If the reference is what most inventories have (see SeeFromMajority): the report of the run, which says what was compared,
     /// and `inventories`. Otherwise null.
     std::shared_ptr<const TComparisonReport> run = nullptr;

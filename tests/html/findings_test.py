@@ -70,6 +70,13 @@ class WhatAFindingHolds(Story):
         self.open('lacking').open_line('INV_Service.Started')
         self.assertEqual(['TRUE: a', 'FALSE: b', 'missing: c'], self.table())
 
+    def test_what_an_option_leaves_out_is_still_missing_in_the_table(self):
+        self.open('only')
+        self.assertEqual('1 missing instance not shown (--only ~)', self.find('.not-shown').text)
+        self.assertIn('Options narrowed what was compared: --class INV_Service', self.find('#rules-text').text)
+        self.open_line('INV_Service.Started')
+        self.assertEqual(['TRUE: a', 'FALSE: b', 'missing: c'], self.table())
+
     def test_an_instance_that_came_shows_what_it_holds_and_where_its_values_differ(self):
         self.open('fleet').open_line('INV_User')
         self.assertEqual('mallory', self.instances()[0].split(' ')[0])

@@ -73,6 +73,8 @@ def arguments_of(name, folder):
         return ['--spec', rules, *inventories.pair(folder)]
     if name == 'equal':
         return [inventories.Server().write(folder / 'one.xml'), inventories.Server().write(folder / 'other.xml')]
+    if name == 'only':
+        return ['--only', '~', '--class', 'INV_Service', *inventories.lacking(folder)]
     return getattr(inventories, name)(folder)
 
 

@@ -21,8 +21,28 @@
 
 namespace NORVZEL20 {
 
+namespace {
+
+// A table of values must not show the reference's value for an inventory that lacks the instance, even if that difference itself is
+// left out.
+TPageClassRows::TLacking FindLacking(const TComparisonReport& report)
+{
+    TPageClassRows::TLacking lacking;
+    if (report.allDifferences != report.differences) {
+        report.allDifferences->ForEach([&lacking](const TDifference& difference) {
+            if (difference.kind == TDifference::kOnlyInReference) {
+                lacking[difference.instance] = difference.inventories;
+            }
+        });
+    }
+    return lacking;
+}
+
+}  // namespace
+
 void CollectPageData(const TComparisonReport& report, TPageData& data)
 {
+    const TPageClassRows::TLacking lacking = FindLacking(report);
     TShortNames names(*report.inventories);
     std::optional<TPageClassRows> rows;  // of the class that is read
     std::size_t number = 0;
@@ -31,7 +51,7 @@ void CollectPageData(const TComparisonReport& report, TPageData& data)
             if (rows) {
                 rows->Write();
             }
-            rows.emplace(report, names, data, difference.className);
+            rows.emplace(report, lacking, names, data, difference.className);
         }
         rows->Add(difference, number);
         ++number;

@@ -2,7 +2,7 @@
 //
 //   { "verdict": "web01 against 7 others: 56 differences",
 //     "counts": { "differences": 56, "onlyInReference": 2, "onlyInOthers": 1, "changedValues": 53 },
-//     "reference": 0,
+//     "notShown": "3 changed values not shown (--only +)", "reference": 0,
 //     "inventories": [ { "label": "web01", "file": "web01.xml", "instances": 330, "namespace": "root/cimv2", "differences": 0 } ],
 //     "classes": [ { "name": "Disk", "onlyInReference": 0, "onlyInOthers": 0, "changedValues": 1, "compared": [ 5, 5 ],
 //                    "differences": [ 0, 1 ], "instances": [ 0, 1 ] } ],
@@ -11,7 +11,7 @@
 //     "findings": [ { "kind": 2, "class": 0, "property": "Size", "set": 1, "first": 0, "rows": 1, "changes": 1, "rarity": 1,
 //                     "example": { "names": [ "sda" ], "reference": "500", "others": [ [ "250", 1 ] ], "short": "" },
 //                     "rule": { "what": "...", "place": "...", "xml": "..." } } ],
-//     "rules": { "name": "rules.xml", "isMade": false, "digest": "9f86...", "text": "..." },
+//     "rules": { "name": "rules.xml", "isMade": false, "options": "", "digest": "9f86...", "text": "..." },
 //     "baseline": [ "2 differences are new ..." ], "coverage": [ "Compared: ..." ] }
 //
 // "compared", "differences" and "instances" have a number for each inventory. The kinds are those of TDifference.
@@ -25,6 +25,7 @@
 
 #include "client/report/BaselineText.h"
 #include "client/report/DescribeAgreement.h"
+#include "client/report/DescribeNotShown.h"
 #include "client/report/DisplayLabels.h"
 #include "client/report/TInventoryNames.h"
 #include "client/report/TextCoverage.h"
@@ -167,6 +168,7 @@ TJson MakePageOverview(const TComparisonReport& report, const TPageData& data)
     TJson overview;
     overview["verdict"] = Verdict(report);
     overview["counts"] = CountsOf(report.differences->GetCounts());
+    overview["notShown"] = DescribeNotShown(report);
     overview["reference"] = 0;
     overview["inventories"] = InventoriesOf(report, data);
     overview["classes"] = ClassesOf(report, data);
@@ -175,7 +177,8 @@ TJson MakePageOverview(const TComparisonReport& report, const TPageData& data)
     overview["findings"] = FindingsOf(report, data);
     overview["rules"] = {{"name", EscapeForDisplay(report.rules)},
                          {"isMade", report.areRulesMade},
-                         {"digest", Sha256Hex(report.rulesText)},
+                         {"options", EscapeForDisplay(report.options)},
+                         {"digest", Sha256Hex(report.options.empty() ? report.rulesText : report.meaning->GetText())},
                          {"text", report.areRulesMade ? std::string() : report.rulesText}};
     overview["baseline"] = BaselineOf(report);
     overview["coverage"] = LinesOf(WriteTextCoverage(report));

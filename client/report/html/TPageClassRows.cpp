@@ -31,8 +31,9 @@ bool SharesKeys(const TDifference& difference)
 
 }  // namespace
 
-TPageClassRows::TPageClassRows(const TComparisonReport& report, TShortNames& names, TPageData& data, const std::string& className)
-    : fNames(names), fData(data), fChanges(data, report.labels), fReportInventories(*report.inventories),
+TPageClassRows::TPageClassRows(const TComparisonReport& report, const TLacking& lacking, TShortNames& names, TPageData& data,
+                               const std::string& className)
+    : fLacking(lacking), fNames(names), fData(data), fChanges(data, report.labels), fReportInventories(*report.inventories),
       fInventories(report.labels.size())
 {
     fClass.name = className;
@@ -61,7 +62,9 @@ void TPageClassRows::AddInstance(const TDifference& difference)
         fInstances.push_back({fData.texts.Add(fNames.Of(difference)), fData.texts.Add(EscapeForDisplay(difference.GetKeyText()))});
     }
     TInstance& instance = fInstances.back();
-    if (difference.kind == TDifference::kOnlyInReference) {
+    if (const auto lacking = fLacking.find(difference.instance); lacking != fLacking.end()) {
+        instance.lacking = fData.sets.Add(lacking->second);
+    } else if (difference.kind == TDifference::kOnlyInReference) {
         instance.lacking = fData.sets.Add(difference.inventories);
     }
     if (SharesKeys(difference)) {

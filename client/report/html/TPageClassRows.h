@@ -19,8 +19,12 @@ namespace NORVZEL20 {
 /// Gathers the differences of one class, which are added in the order of IDifferences, and writes them into the data of a page.
 class TPageClassRows {
   public:
-    /// All must outlive this.
-    TPageClassRows(const TComparisonReport& report, TShortNames& names, TPageData& data, const std::string& className);
+    /// The inventories that lack instances, by the key of the instance; see TDifference::instance.
+    using TLacking = std::unordered_map<std::string, std::vector<std::size_t>>;
+
+    /// `lacking` names those of instances whose absence the report leaves out. All must outlive this.
+    TPageClassRows(const TComparisonReport& report, const TLacking& lacking, TShortNames& names, TPageData& data,
+                   const std::string& className);
 
     const std::string& GetClassName() const { return fClass.name; }
 
@@ -72,6 +76,7 @@ class TPageClassRows {
     const TValueWords& WordsFor(const std::string& property);
     std::size_t Rarity(const TFinding& finding) const;
 
+    const TLacking& fLacking;
     TShortNames& fNames;
     TPageData& fData;
     TPageChanges fChanges;

@@ -10,6 +10,7 @@
 
 #include <algorithm>
 
+#include "client/text/QuoteForShell.h"
 #include "embedded/value/TValueXml.h"
 #include "host/RootClassName.h"
 
@@ -72,7 +73,8 @@ TRuleProposals::TRuleProposals(const TComparisonReport& report)
 TRuleProposals::TProposal TRuleProposals::LeaveOutProperty(const std::string& className, const std::string& path)
 {
     const std::string property = path.substr(0, path.find('.'));
-    const std::string what = "Leaves " + property + " of " + className + " out, and of the classes below it.";
+    const std::string what = "Leaves " + property + " of " + className + " out, and of the classes below it; so does --exclude " +
+                             QuoteForShell(className + "." + property) + ".";
     if (!fTrace) {
         return {what, "It is a whole file: compare with --spec FILE.",
                 WholeFile(ElementWith(className, TCIMDiffEngine::INCLUDE, {property}))};

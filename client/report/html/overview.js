@@ -24,6 +24,9 @@ function drawHead(overview) {
     }
     byId("counts").append(element("li", {}, element("strong", {}, formatted(overview.classes.length)),
         ` of ${counted(overview.comparedClasses, "class", "classes")} differ`));
+    if (overview.notShown) {
+        byId("counts").append(element("li", { class: "not-shown" }, overview.notShown));
+    }
     const differing = overview.inventories.filter((inventory, i) => i !== overview.reference && inventory.differences > 0).length;
     if (!isPair) {
         byId("counts").append(element("li", {}, element("strong", {}, formatted(differing)),
@@ -209,9 +212,16 @@ function drawInventories(overview) {
 function drawRules(overview) {
     const { rules } = overview;
     const root = byId("rules-text");
-    root.append(element("p", {}, rules.isMade ? "No rules were given: everything was compared." : "Compared as ",
-        rules.isMade ? null : element("span", { class: "value" }, rules.name), rules.isMade ? null : " says."),
-    element("p", {}, "SHA-256 of the rules: ", element("code", { id: "digest" }, rules.digest)));
+    const said = element("p");
+    if (rules.isMade) {
+        said.append(rules.options ? "No rules file was given." : "No rules were given: everything was compared.");
+    } else {
+        said.append("Compared as ", element("span", { class: "value" }, rules.name), " says.");
+    }
+    if (rules.options) {
+        said.append(" Options narrowed what was compared: ", element("span", { class: "value" }, rules.options), ".");
+    }
+    root.append(said, element("p", {}, "SHA-256 of the rules: ", element("code", { id: "digest" }, rules.digest)));
     if (rules.text) {
         root.append(element("details", {}, element("summary", {}, "The rules"),
             element("pre", { tabindex: "0", role: "region", "aria-label": "Text of the rules" }, rules.text)));
