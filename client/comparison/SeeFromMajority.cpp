@@ -29,6 +29,9 @@ void PutMajorityInFront(TCoverage& coverage)
         ++note.inventory;
         ++note.source;
     }
+    for (TCoverage::TLack& lack : coverage.lacks) {
+        ++lack.inventory;
+    }
     for (TCoverage::TBadValues& bad : coverage.badValues) {
         ++bad.inventory;
     }

@@ -50,7 +50,7 @@ bool TCoverage::IsCompleteButForTimes() const
 
 bool TCoverage::IsComplete(bool timesCount) const
 {
-    return !IsNothingCompared() && badValues.empty() &&
+    return !IsNothingCompared() && badValues.empty() && lacks.empty() &&
            std::all_of(classes.begin(), classes.end(), [timesCount](const TClass& cls) { return IsWhole(cls, timesCount); });
 }
 

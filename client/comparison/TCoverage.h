@@ -6,6 +6,7 @@
 #include <vector>
 
 #include "client/comparison/TNameHint.h"
+#include "client/inventory/NotCollected.h"
 #include "client/inventory/TInventory.h"
 #include "client/inventory/TSchemaNote.h"
 
@@ -66,6 +67,12 @@ struct TCoverage {
         TBadProperty found;
     };
 
+    /// What an inventory says that it lacks, for one reason.
+    struct TLack {
+        std::size_t inventory;
+        TNotCollected what;
+    };
+
     /// A system that an inventory calls otherwise than the reference.
     struct TName {
         std::size_t inventory;
@@ -76,11 +83,13 @@ struct TCoverage {
     std::size_t classesWithout = 0;     ///< classes without an instance in any inventory
     std::vector<TSchemaNote> notes;     ///< what was done to make the inventories comparable, in that order
     std::vector<TBadValues> badValues;  ///< by inventory, then in the order of the files
+    std::vector<TLack> lacks;           ///< by inventory, then in the order of its instances
     std::vector<TName> names;           ///< by inventory, if keys or references were changed
     std::optional<TNameHint> hint;      ///< a class of which nothing matches because systems are called differently
 
     /// Whether there were instances to compare, and every instance of every inventory was compared in every property, references
-    /// as a whole, and every value as what its type says.
+    /// as a whole, every value as what its type says,
+    /// and no inventory says that it lacks anything.
     bool IsComplete() const;
     /// The same, times of collection aside: a class whose default is to include is compared without them.
     bool IsCompleteButForTimes() const;

@@ -14,6 +14,7 @@
 #include <algorithm>
 
 #include "client/comparison/DescribeExcludedKeys.h"
+#include "client/inventory/NotCollected.h"
 #include "client/inventory/UncomparedSystems.h"
 #include "embedded/value/TNameText.h"
 #include "provider/DeltaNames.h"
@@ -34,6 +35,9 @@ TCoverage TCoverageBuilder::Build()
     for (std::size_t i = 0; i < fInventories.size(); ++i) {
         for (const TBadProperty& found : fInventories[i].loaded.badProperties) {
             coverage.badValues.push_back({i, found});
+        }
+        for (const TNotCollected& what : FindNotCollected(*fInventories[i].ns)) {
+            coverage.lacks.push_back({i, what});
         }
         for (const TOwnName& name : fInventories[i].ownNames) {
             if (name.replaced + name.marked > 0) {

@@ -147,6 +147,15 @@ TJson JsonOfName(const TComparisonReport& report, const TCoverage::TName& entry)
             {"anotherSystem", entry.name.marked},          {"withinLongerTexts", within}};
 }
 
+TJson JsonOfLack(const TComparisonReport& report, const TCoverage::TLack& lack)
+{
+    return {{"inventory", report.labels[lack.inventory]},
+            {"kind", lack.what.kind},
+            {"reason", lack.what.reason},
+            {"count", lack.what.count},
+            {"subjects", lack.what.subjects}};
+}
+
 TJson JsonOfHints(const TCoverage& coverage)
 {
     TJson hints = TJson::array();
@@ -179,9 +188,17 @@ nlohmann::ordered_json JsonOfCoverage(const TComparisonReport& report)
     for (const TCoverage::TName& name : report.coverage.names) {
         names.push_back(JsonOfName(report, name));
     }
-    return {{"classes", classes},   {"classesWithoutInstances", report.coverage.classesWithout},
-            {"schema", notes},      {"badValues", badValues},
-            {"systemNames", names}, {"hints", JsonOfHints(report.coverage)}};
+    TJson lacks = TJson::array();
+    for (const TCoverage::TLack& lack : report.coverage.lacks) {
+        lacks.push_back(JsonOfLack(report, lack));
+    }
+    TJson json = {{"classes", classes},   {"classesWithoutInstances", report.coverage.classesWithout},
+                  {"schema", notes},      {"badValues", badValues},
+                  {"systemNames", names}, {"hints", JsonOfHints(report.coverage)}};
+    if (!lacks.empty()) {
+        json["notCollected"] = lacks;
+    }
+    return json;
 }
 
 }  // namespace NORVZEL20

@@ -2,6 +2,7 @@
 //
 //   330 and 332 instances in 9 classes compared; 9 properties left out by r2.xml (--coverage)
 //   Not compared: 2 classes with 40 and 41 instances: Process, Thread (--coverage)
+//   web07 was collected without instances: Fan (CIM_ERR_FAILED (1)) (--coverage)
 //   2 values that did not fit taken as NULL; 3 declarations differ between inventories (--coverage)
 //   Hint: 0 of 350 instances of Disk match; ...
 #include "client/report/ShortCoverage.h"
@@ -11,6 +12,7 @@
 #include <set>
 #include <vector>
 
+#include "client/report/DescribeLack.h"
 #include "client/report/DescribeNameHint.h"
 #include "client/text/Counted.h"
 #include "client/text/DisplayText.h"
@@ -80,6 +82,26 @@ std::string NotCompared(const TComparisonReport& report)
     }
     return "Not compared: " + Counted(names.size(), "class", "classes") + " with " + Range(counts) +
            " instances: " + SomeOf(names) + kSeeCoverage + "\n";
+}
+
+// A line for each inventory that says that it lacks something.
+std::string CollectedWithout(const TComparisonReport& report)
+{
+    std::string lines;
+    const std::vector<TCoverage::TLack>& lacks = report.coverage.lacks;
+    for (std::size_t i = 0; i < report.labels.size(); ++i) {
+        std::vector<std::string> texts;
+        for (const TCoverage::TLack& lack : lacks) {
+            if (lack.inventory == i) {
+                texts.push_back(DescribeLack(lack.what));
+            }
+        }
+        if (!texts.empty()) {
+            lines += DisplayLabel(report.labels[i]) + " was collected without " + boost::algorithm::join(texts, "; ") +
+                     kSeeCoverage + "\n";
+        }
+    }
+    return lines;
 }
 
 void AddSharing(std::vector<std::string>& reservations, const TCoverage& coverage)
@@ -160,7 +182,7 @@ std::string WriteShortCoverage(const TComparisonReport& report)
     if (report.run) {
         return WriteShortCoverage(*report.run);
     }
-    return Compared(report) + NotCompared(report) + Reservations(report) +
+    return Compared(report) + NotCompared(report) + CollectedWithout(report) + Reservations(report) +
            (report.coverage.hint ? DescribeNameHint(*report.coverage.hint) + "\n" : std::string());
 }
 

@@ -11,6 +11,7 @@
 //   References of Mount were compared without key Bus and without their namespace.
 //   Compared as "web01" in keys and references of web02: "web02" (706 times).
 //   Values of web02 that do not fit their types, taken as NULL: Disk.Size (2, the first "70000" for a uint16 at web02.xml:12).
+//   web02 was collected without instances: Fan, Sensor (CIM_ERR_FAILED (1), "crashed").
 //   Declared in web02 as in web01: class Tape, Disk.Model.
 //   Made in web02: an instance of KALMO_OperatingSystem.
 //   Hint: 0 of 350 instances of Disk match; SystemName has one value in each inventory: try --self SystemName.
@@ -23,6 +24,7 @@
 #include <map>
 #include <utility>
 
+#include "client/report/DescribeLack.h"
 #include "client/report/DescribeNameHint.h"
 #include "client/report/DisplayLabels.h"
 #include "client/rules/DescribeReducedReferences.h"
@@ -48,6 +50,7 @@ class TStatement {
         WriteReferences();
         WriteNames();
         WriteBadValues();
+        WriteLacks();
         WriteNotes();
         WriteNamespaces();
         WriteInferred();
@@ -234,6 +237,13 @@ class TStatement {
         for (const auto& [where, properties] : found) {
             fOut += "Values of " + Label(where.first) + " that do not fit their types, " +
                     (where.second ? "compared as text" : "taken as NULL") + ": " + SomeOf(properties) + ".\n";
+        }
+    }
+
+    void WriteLacks()
+    {
+        for (const TCoverage::TLack& lack : fCoverage.lacks) {
+            fOut += Label(lack.inventory) + " was collected without " + DescribeLackWholly(lack.what) + ".\n";
         }
     }
 
