@@ -4,6 +4,7 @@
 #include <memory>
 
 #include "client/AddBaseline.h"
+#include "client/AddCollectFrom.h"
 #include "client/AddCollectOptions.h"
 #include "client/AddLoadingOptions.h"
 #include "client/AddReferenceOptions.h"
@@ -228,11 +229,17 @@ void TCommands::AddShow()
 
 void TCommands::AddCollect()
 {
-    CLI::App* command = AddCommand("collect", "write an inventory of this Linux system", [this](IConsole& console) {
-        CheckCollect(fCollect);
-        return RunCollect(fCollect, console);
-    });
+    CLI::App* command =
+        AddCommand("collect", "write an inventory of this Linux system, or of a WBEM server", [this](IConsole& console) {
+            if (!fCollectFrom.server.empty()) {
+                fCollectFrom.output = fCollect.output;
+                return RunCollectFrom(fCollectFrom, console);
+            }
+            CheckCollect(fCollect);
+            return RunCollect(fCollect, console);
+        });
     AddCollectOptions(command, fCollect);
+    AddCollectFrom(command, fCollectFrom);
 }
 
 }  // namespace NORVZEL20

@@ -5,6 +5,7 @@
 
 #include "client/commands/CheckCommand.h"
 #include "client/commands/CollectCommand.h"
+#include "client/commands/CollectFromCommand.h"
 #include "client/commands/CompareCommand.h"
 #include "client/commands/ExplainCommand.h"
 #include "client/commands/NoiseCommand.h"
@@ -45,6 +46,7 @@ class TCommands {
     TNoiseOptions fNoise;
     TCheckOptions fCheck;
     TCollectOptions fCollect;
+    TCollectFromOptions fCollectFrom;
     TExplainOptions fExplain;
     TQueryOptions fQuery;
     TShowOptions fShow;

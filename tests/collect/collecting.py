@@ -1,0 +1,79 @@
+"""What the tests of `cimdelta collect --from` share: documents, servers, and the program run in a folder of its own.
+
+The arguments of each test are ROOT CIMDELTA.
+"""
+import os
+import pathlib
+import subprocess
+import sys
+import tempfile
+import unittest
+
+import made_server
+
+ROOT, CIMDELTA = pathlib.Path(sys.argv[1]).resolve(), str(pathlib.Path(sys.argv[2]).resolve())
+DATA = ROOT / "tests/data"
+
+
+def document(*classes, instances=()):
+    """A document with classes ("Fan", "Fan:Top"; "*Top" is abstract) and instances ("Fan", "1")."""
+    text = ""
+    for name in classes:
+        is_abstract, name = name.startswith("*"), name.lstrip("*")
+        name, _, above = name.partition(":")
+        text += (f'<VALUE.OBJECT><CLASS NAME="{name}"' + (f' SUPERCLASS="{above}"' if above else "") + ">"
+                 + ('<QUALIFIER NAME="Abstract" TYPE="boolean"><VALUE>TRUE</VALUE></QUALIFIER>' if is_abstract else "")
+                 + ("" if above else '<PROPERTY NAME="Id" TYPE="string"><QUALIFIER NAME="Key" TYPE="boolean"><VALUE>TRUE</VALUE></QUALIFIER></PROPERTY>')
+                 + "</CLASS></VALUE.OBJECT>")
+    for name, key in instances:
+        text += f'<VALUE.OBJECT><INSTANCE CLASSNAME="{name}"><PROPERTY NAME="Id" TYPE="string"><VALUE>{key}</VALUE></PROPERTY></INSTANCE></VALUE.OBJECT>'
+    return f"<CIM><DECLARATION><DECLGROUP>{text}</DECLGROUP></DECLARATION></CIM>"
+
+
+SMALL = document("*Top", "Disk:Top", "Fan:Top", "Volume:Top", instances=[("Disk", "sda"), ("Disk", "sdb"), ("Fan", "1"), ("Volume", "v")])
+
+
+class TCollect(unittest.TestCase):
+    """Verbs."""
+
+    maxDiff = None
+
+    def setUp(self):
+        scratch = tempfile.TemporaryDirectory()
+        self.addCleanup(scratch.cleanup)
+        self.folder = pathlib.Path(scratch.name)
+        self.environment = {name: value for name, value in os.environ.items() if not name.lower().endswith("_proxy")}
+        self.environment.update(CIMDELTA_ROOT=str(ROOT), HOME=str(self.folder))
+
+    def serve(self, namespaces=None, **how):
+        server = made_server.MadeServer(namespaces or {"root/cimv2": SMALL}, **how)
+        server.__enter__()
+        self.addCleanup(server.__exit__)
+        return server
+
+    def run_program(self, *arguments, **environment):
+        return subprocess.run([CIMDELTA, *map(str, arguments)], cwd=self.folder, env=dict(self.environment, **environment), stdin=subprocess.DEVNULL,
+                              stdout=subprocess.PIPE, stderr=subprocess.PIPE, text=True, check=False, timeout=60, start_new_session=True)
+
+    def collect(self, server, *arguments, **environment):
+        """Collects into out.xml. Returns the messages."""
+        self.result = self.run_program("collect", "--from", server.url, "-o", "out.xml", *arguments, **environment)
+        self.assertEqual("", self.result.stdout)
+        return self.result.stderr.replace(server.url, "SERVER")
+
+    def assert_collected(self, server, *arguments, **environment):
+        self.assertEqual("", self.collect(server, *arguments, **environment))
+        self.assertEqual(0, self.result.returncode)
+        self.assertEqual(["out.xml"], self.files())
+
+    def assert_refused(self, message, server, *arguments, **environment):
+        """Ends with trouble, that message and no file."""
+        self.assertEqual(message + "\n", self.collect(server, *arguments, **environment))
+        self.assertEqual(2, self.result.returncode)
+        self.assertEqual([], self.files())
+
+    def files(self):
+        return sorted(path.name for path in self.folder.iterdir() if path.suffix != ".pem" and path.name != "netrc")
+
+    def shown(self, path="out.xml"):
+        return self.run_program("show", path).stdout
