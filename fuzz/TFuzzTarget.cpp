@@ -5,6 +5,7 @@ namespace NORVZEL20 {
 const std::vector<TFuzzTarget>& TFuzzTarget::GetAll()
 {
     static const std::vector<TFuzzTarget> fgTargets = {
+        {"answer", FuzzAnswer},
         {"arguments", FuzzArguments},
         {"baseline", FuzzBaseline},
         {"collect", FuzzCollect},

@@ -16,6 +16,7 @@ struct TFuzzTarget {
     static const std::vector<TFuzzTarget>& GetAll();
 };
 
+void FuzzAnswer(std::string_view input);         ///< an answer of a WBEM server
 void FuzzArguments(std::string_view input);      ///< a command line of the client, one argument a line
 void FuzzBaseline(std::string_view input);       ///< a file of accepted differences
 void FuzzCollect(std::string_view input);        ///< a text or bytes of a system from which an inventory is collected
