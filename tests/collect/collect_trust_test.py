@@ -9,7 +9,6 @@ import pty
 import re
 import select
 import signal
-import subprocess
 import sys
 import termios
 import time
@@ -19,15 +18,6 @@ from collecting import CIMDELTA, TCollect
 
 
 class TlsTest(TCollect):
-    def certificate(self, name="localhost", alternative="IP:127.0.0.1", is_expired=False):
-        """A self-signed certificate; returns the files of it and its key."""
-        files = self.folder / "cert.pem", self.folder / "key.pem"
-        subprocess.run(["openssl", "req", "-x509", "-newkey", "ec", "-pkeyopt", "ec_paramgen_curve:prime256v1", "-nodes", "-days", "1", "-subj", f"/CN={name}",
-                        "-addext", f"subjectAltName={alternative}", "-keyout", files[1], "-out", files[0]], check=True, stderr=subprocess.DEVNULL)
-        if is_expired:
-            subprocess.run(["openssl", "x509", "-in", files[0], "-signkey", files[1], "-days", "-1", "-out", files[0]], check=True, stderr=subprocess.DEVNULL)
-        return [str(file) for file in files]
-
     def test_a_certificate_that_was_given_is_trusted(self):
         certificate = self.certificate()
         self.assert_collected(self.serve(certificate=certificate), "--ca", certificate[0])

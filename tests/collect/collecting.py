@@ -10,9 +10,12 @@ import tempfile
 import unittest
 
 import made_server
+import recorded_server
 
 ROOT, CIMDELTA = pathlib.Path(sys.argv[1]).resolve(), str(pathlib.Path(sys.argv[2]).resolve())
 DATA = ROOT / "tests/data"
+
+RECORDINGS = ("025-pywbem-EnumerateClasses", "027-pywbem-EnumerateQualifiers", "030-pywbem-EnumerateInstances", "007-wbemcli-ei-assoc")
 
 
 def document(*classes, instances=()):
@@ -51,6 +54,12 @@ class TCollect(unittest.TestCase):
         self.addCleanup(server.__exit__)
         return server
 
+    def serve_recordings(self, recordings=RECORDINGS, **how):
+        server = recorded_server.RecordedServer(DATA / "wire", recordings, **how)
+        server.__enter__()
+        self.addCleanup(server.__exit__)
+        return server
+
     def run_program(self, *arguments, **environment):
         return subprocess.run([CIMDELTA, *map(str, arguments)], cwd=self.folder, env=dict(self.environment, **environment), stdin=subprocess.DEVNULL,
                               stdout=subprocess.PIPE, stderr=subprocess.PIPE, text=True, check=False, timeout=60, start_new_session=True)
@@ -77,3 +86,12 @@ class TCollect(unittest.TestCase):
 
     def shown(self, path="out.xml"):
         return self.run_program("show", path).stdout
+
+    def certificate(self, name="localhost", alternative="IP:127.0.0.1", is_expired=False):
+        """A self-signed certificate; returns the files of it and its key."""
+        files = self.folder / "cert.pem", self.folder / "key.pem"
+        subprocess.run(["openssl", "req", "-x509", "-newkey", "ec", "-pkeyopt", "ec_paramgen_curve:prime256v1", "-nodes", "-days", "1", "-subj", f"/CN={name}",
+                        "-addext", f"subjectAltName={alternative}", "-keyout", files[1], "-out", files[0]], check=True, stderr=subprocess.DEVNULL)
+        if is_expired:
+            subprocess.run(["openssl", "x509", "-in", files[0], "-signkey", files[1], "-days", "-1", "-out", files[0]], check=True, stderr=subprocess.DEVNULL)
+        return [str(file) for file in files]

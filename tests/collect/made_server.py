@@ -203,6 +203,10 @@ class MadeServer(http.server.ThreadingHTTPServer):
         """Acts instead of answering that operation about that class ("" for none), a number of times or always."""
         self.rules.append([operation, subject, act, times])
 
+    def right_answer(self, handler, unused, names):
+        """The body; None for what is not offered."""
+        return handler.message(handler.result(names))
+
     def act_for(self, operation, subject):
         for rule in self.rules:
             if rule[0] == operation and rule[1] in ("*", subject) and rule[3] != 0:
@@ -227,8 +231,8 @@ class _Handler(http.server.BaseHTTPRequestHandler):
     protocol_version = "HTTP/1.1"
 
     def do_POST(self):
-        request = etree.fromstring(self.rfile.read(int(self.headers["Content-Length"])))
-        call = request.find(".//IMETHODCALL")
+        request = self.rfile.read(int(self.headers["Content-Length"]))
+        call = etree.fromstring(request).find(".//IMETHODCALL")
         self.operation = call.get("NAME")
         names = {name.get("NAME"): "".join(name.itertext()) or name[0].get("NAME") for name in call.findall("IPARAMVALUE")}
         self.namespace = "/".join(part.get("NAME") for part in call.find("LOCALNAMESPACEPATH"))
@@ -240,10 +244,12 @@ class _Handler(http.server.BaseHTTPRequestHandler):
         if self.server.authorization not in (None, self.headers["Authorization"]):
             self.answer(b"<html>Who?</html>", status=401, headers={"WWW-Authenticate": 'Basic realm="cim"'})
             return
-        right = self.message(self.result(names))
+        right = self.server.right_answer(self, request, names)
         act = self.server.act_for(self.operation, subject)
         if act:
             act(self, right)
+        elif right is None:
+            self.answer(b"", status=501)
         else:
             self.answer(right)
 
