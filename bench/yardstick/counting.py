@@ -28,12 +28,14 @@ def in_json(path):
     """For two inventories: each element of the list holds for one of them."""
     summary = None
     listed = 0
+    is_in_list = False
     with open(path, encoding="utf-8") as file:
         for line in file:
             if summary is None:
-                found = re.match(r'\s*"differences": (\d+),', line)
+                found = re.match(r'    "differences": (\d+),', line)
                 summary = int(found[1]) if found else None
-            listed += line.startswith('      "kind": ')
+            is_in_list = line.startswith('  "differences": [') or (is_in_list and not line.startswith("  ]"))
+            listed += is_in_list and line.startswith('      "kind": ')
     if summary != listed:
         raise NotCountable(f"{path}: the summary counts {summary}, the list {listed}")
     return listed

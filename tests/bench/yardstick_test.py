@@ -180,8 +180,8 @@ class CountingTest(unittest.TestCase):
     DAMAGED = (
         ("ndjson", COVERAGE % 1, "the summary counts 1, the list 0"),
         ("ndjson", RECORD, "no line says"),
-        ("json", '    "differences": 2,\n      "kind": "changed",\n', "the summary counts 2, the list 1"),
-        ("json", '      "kind": "changed",\n', "the summary counts None"),
+        ("json", '    "differences": 2,\n  "differences": [\n      "kind": "changed",\n  ],\n      "kind": "changed",\n', "the summary counts 2, the list 1"),
+        ("json", '  "differences": [\n      "kind": "changed",\n', "the summary counts None"),
         ("text", "2 differences between a and b\n- X=1\n", "the headline counts 2, the list 1"),
         ("text", "No differences\n", "the headline counts nothing"),
     )
