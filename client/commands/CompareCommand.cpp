@@ -6,6 +6,7 @@
 #include "client/baseline/ReadBaseline.h"
 #include "client/commands/SaveRules.h"
 #include "client/commands/TCountingDifferences.h"
+#include "client/commands/WriteReport.h"
 #include "client/comparison/SeeFromMajority.h"
 #include "client/comparison/TComparison.h"
 #include "client/inventory/AlignSystemNames.h"
@@ -15,7 +16,6 @@
 #include "client/process/TProgress.h"
 #include "client/report/DescribeNothingCompared.h"
 #include "client/report/TResultOutput.h"
-#include "client/report/WriteReport.h"
 #include "client/rules/ReadRules.h"
 
 namespace NORVZEL20 {

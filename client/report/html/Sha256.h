@@ -5,7 +5,7 @@
 
 namespace NORVZEL20 {
 
-/// The SHA-256 digest of a text (FIPS 180-4): 32 bytes.
+/// The SHA-256 digest of a text (FIPS 180-4): 32 bytes. Errors: std::bad_alloc.
 std::string Sha256(std::string_view text);
 
 /// The same as 64 hexadecimal digits.

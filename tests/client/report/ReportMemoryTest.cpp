@@ -1,10 +1,10 @@
 // What a report takes beyond the inventories and the records of the run. The meter counts every allocation of the process.
 
+#include "client/commands/WriteReport.h"
 #include "client/comparison/TComparison.h"
 #include "client/comparison/TDifferenceList.h"
 #include "client/inventory/TInventoryLoader.h"
 #include "client/report/EOutputFormat.h"
-#include "client/report/WriteReport.h"
 #include "tests/client/Documents.h"
 #include "tests/client/SourcesOf.h"
 #include "tests/client/TClientFixture.h"

@@ -1,4 +1,4 @@
-#include "client/report/WriteReport.h"
+#include "client/commands/WriteReport.h"
 
 #include "client/findings/CollectFindings.h"
 #include "client/report/CimXmlFormat.h"
