@@ -336,6 +336,14 @@ class AllNamespacesTest(TCollect):
         self.assertEqual([], server.calls)
 
 
+class ProgressTest(TCollect):
+    def test_a_waiting_person_sees_how_far_it_is(self):
+        server = self.serve({"root/cimv2": document("Disk", "Fan", instances=[("Disk", "1"), ("Disk", "2"), ("Fan", "1")])})
+        server.misbehave("OpenEnumerateInstances", "Fan", made_server.late)
+        self.assertIn("collecting root/cimv2 from SERVER 1 of 2 classes, 2 instances, 0 MiB (1 s)", self.talk(server))
+        self.assertEqual(0, self.status)
+
+
 class InterruptedTest(TCollect):
     def test_an_interrupt_leaves_nothing_behind(self):
         server = self.serve()

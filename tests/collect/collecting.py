@@ -4,9 +4,14 @@ The arguments of each test are ROOT CIMDELTA.
 """
 import os
 import pathlib
+import pty
+import re
+import select
 import subprocess
 import sys
 import tempfile
+import termios
+import time
 import unittest
 
 import made_server
@@ -95,3 +100,26 @@ class TCollect(unittest.TestCase):
         if is_expired:
             subprocess.run(["openssl", "x509", "-in", files[0], "-signkey", files[1], "-days", "-1", "-out", files[0]], check=True, stderr=subprocess.DEVNULL)
         return [str(file) for file in files]
+
+    def talk(self, server, *lines, **environment):
+        """Runs on a terminal and types each line when a question has come. Returns what the terminal showed."""
+        pid, terminal = pty.fork()
+        if pid == 0:
+            os.chdir(self.folder)
+            os.execve(CIMDELTA, [CIMDELTA, "collect", "--from", server.url, "-o", "out.xml"], dict(self.environment, **environment))
+        shown, left = "", list(lines)
+        end = time.monotonic() + 60
+        while time.monotonic() < end:
+            if select.select([terminal], [], [], 0.1)[0]:
+                try:
+                    piece = os.read(terminal, 4096).decode()
+                except OSError:
+                    break
+                shown += piece
+            if left and shown.endswith(": ") and not select.select([terminal], [], [], 0.2)[0]:
+                line = left.pop(0)
+                os.write(terminal, line if isinstance(line, bytes) else (line + "\n").encode())
+        self.status = os.waitstatus_to_exitcode(os.waitpid(pid, 0)[1])
+        self.shows_typing = bool(termios.tcgetattr(terminal)[3] & termios.ECHO)
+        os.close(terminal)
+        return re.sub(r"\x1b\[K|\r", "", shown).replace(server.url, "SERVER")

@@ -149,6 +149,12 @@ def silent(handler, unused):
     handler.close_connection = True
 
 
+def late(handler, right):
+    """Answers after a while in which a person gets impatient."""
+    handler.server.over.wait(1.5)
+    handler.answer(right)
+
+
 def trickle(handler, unused):
     """An answer that never ends, a byte now and then."""
     handler.send_response(200)
