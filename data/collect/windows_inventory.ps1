@@ -27,9 +27,9 @@ function Add-Object($to, $bytes) {
 
 function Add-Class($name) {
     while ($name -and -not $declared[$name]) {
-        $declared[$name] = $true
         $cim = Get-CimClass -Namespace $Namespace -ClassName $name
         Add-Object $classes ($serializer.Serialize($cim, $classOnly))
+        $declared[$name] = $true
         $name = $cim.CimSuperClassName
     }
 }
@@ -45,7 +45,7 @@ function Add-Missing($name, $reason) {
     Write-Warning "not collected: ${name}: $reason"
 }
 
-foreach ($name in $Class) {
+foreach ($name in $Class -split ',') {  # -File passes a list as one text
     try {
         foreach ($instance in @(Get-CimInstance -Namespace $Namespace -ClassName $name)) {
             Add-Class $instance.CimClass.CimClassName
