@@ -10,6 +10,7 @@
 #include <algorithm>
 #include <boost/algorithm/string/join.hpp>
 #include <set>
+#include <utility>
 #include <vector>
 
 #include "client/report/DescribeLack.h"
@@ -84,24 +85,48 @@ std::string NotCompared(const TComparisonReport& report)
            " instances: " + SomeOf(names) + kSeeCoverage + "\n";
 }
 
-// A line for each inventory that says that it lacks something.
-std::string CollectedWithout(const TComparisonReport& report)
+// What an inventory says that it lacks, in few words; empty for nothing.
+std::string DescribeLacksOf(std::size_t inventory, const TCoverage& coverage)
 {
-    std::string lines;
-    const std::vector<TCoverage::TLack>& lacks = report.coverage.lacks;
-    for (std::size_t i = 0; i < report.labels.size(); ++i) {
-        std::vector<std::string> texts;
-        for (const TCoverage::TLack& lack : lacks) {
-            if (lack.inventory == i) {
-                texts.push_back(DescribeLack(lack.what));
-            }
-        }
-        if (!texts.empty()) {
-            lines += DisplayLabel(report.labels[i]) + " was collected without " + boost::algorithm::join(texts, "; ") +
-                     kSeeCoverage + "\n";
+    constexpr std::size_t kMost = 3;
+    std::vector<std::string> texts;
+    for (const TCoverage::TLack& lack : coverage.lacks) {
+        if (lack.inventory == inventory) {
+            texts.push_back(DescribeLack(lack.what));
         }
     }
-    return lines;
+    const std::size_t others = texts.size() > kMost + 1 ? texts.size() - kMost : 0;
+    texts.resize(texts.size() - others);
+    return boost::algorithm::join(texts, "; ") + (others > 0 ? "; and " + std::to_string(others) + " more" : "");
+}
+
+// A line for all inventories that lack the same.
+std::string CollectedWithout(const TComparisonReport& report)
+{
+    constexpr std::size_t kMostLines = 5;
+    std::vector<std::pair<std::string, std::vector<std::string>>> groups;
+    for (std::size_t i = 0; i < report.labels.size(); ++i) {
+        const std::string text = DescribeLacksOf(i, report.coverage);
+        auto group = std::find_if(groups.begin(), groups.end(), [&text](const auto& known) { return known.first == text; });
+        if (group == groups.end()) {
+            group = groups.insert(group, {text, {}});
+        }
+        group->second.push_back(DisplayLabel(report.labels[i]));
+    }
+    groups.erase(std::remove_if(groups.begin(), groups.end(), [](const auto& group) { return group.first.empty(); }), groups.end());
+    std::string lines;
+    std::size_t others = 0;
+    for (std::size_t i = 0; i < groups.size(); ++i) {
+        const auto& [text, labels] = groups[i];
+        if (i >= kMostLines) {
+            others += labels.size();
+            continue;
+        }
+        lines += SomeOf(labels) + (labels.size() == 1 ? " was" : " were") + " collected without " + text + kSeeCoverage + "\n";
+    }
+    return others == 0 ? lines
+                       : lines + Counted(others, "more inventory was", "more inventories were") + " not collected whole" +
+                             kSeeCoverage + "\n";
 }
 
 void AddSharing(std::vector<std::string>& reservations, const TCoverage& coverage)
