@@ -35,7 +35,7 @@ from small_documents import (  # noqa: E402
 
 CIMDELTA, ROOT = (pathlib.Path(sys.argv[1]).resolve(), pathlib.Path(sys.argv[2]).resolve()) if len(sys.argv) > 2 else (None, None)
 ACCEPTED = ROOT / "tests/client/data/accepted.txt" if ROOT else None
-OPTIONAL = {"sharing", "path", "madeIn", "embedded", "parts", "disagreements", "baseline", "notShown"}
+OPTIONAL = {"sharing", "path", "madeIn", "embedded", "parts", "disagreements", "baseline", "notShown", "notCollected"}
 MAPS = {"keys", "contents", "properties"}  # names in them are those of an inventory
 WORDS = {"format", "role", "namespaceFrom", "kind", "state", "reason", "takenAs", "type"}
 
@@ -142,7 +142,16 @@ NAMED = (
     "</DECLARATION></CIM>"
 )
 TIMED = document(SYSTEM, cls("Probe", declared("DateTimeOfCollection", "datetime")), instance("Probe", ""))
+LACK = document(
+    SYSTEM,
+    cls("KALMO_NotCollected", key("Kind") + key("Reason") + declared("Count", "uint32") + declared_array("Subjects")),
+    instance(
+        "KALMO_NotCollected",
+        value("Kind", "Disk") + value("Reason", "CIM_ERR_FAILED (1)") + value("Count", "1", "uint32") + array("Subjects", ["sda"]),
+    ),
+)
 CASES = {
+    "not collected": ([LACK, LACK],),
     "a pair": ([document(disk(declared("Size", "uint32"), value("Size", "1", "uint32"))), document(disk(declared("Size", "uint32")))],),
     "equal": ([document(disk("")), document(disk(""))],),
     "a fleet": ([ROOT / "tests/client/data" / f"web0{number}.xml" for number in (1, 2, 3)] if ROOT else [],),
@@ -354,7 +363,7 @@ class SchemaTest(unittest.TestCase):
 
     def test_a_word_that_it_does_not_know_is_refused(self):
         def mutations(where, shape, node, report):
-            is_free = "first" in shape or shape[-1:] == ("*",) or shape[:1] == ("baseline",) and where[-1] == "reason"
+            is_free = "first" in shape or "notCollected" in shape or shape[-1:] == ("*",) or shape[:1] == ("baseline",) and where[-1] == "reason"
             if where and where[-1] in WORDS and not is_free:
                 yield "another word", with_change(report, where, set_to("nonsense"))
 
