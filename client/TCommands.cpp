@@ -129,8 +129,9 @@ void TCommands::AddCompare()
         });
     AddText(command, "REFERENCE", fReference, kInventoryHelp)->required()->option_text(" ");
     AddText(command, "OTHER", fOthers, "the inventories to compare with the reference")->required()->option_text("...");
-    AddText(command, "--spec", fCompare.rules,
-            "a rules file that says what to compare, or - for standard input (default: everything)")
+    AddText(
+        command, "--spec", fCompare.rules,
+        "a rules file that says what to compare, - for standard input, or linux for inventories of collect (default: everything)")
         ->option_text("RULES");
     AddFormat(command, fCompare.format, ReportFormatNames());
     AddLoadingOptions(command, fCompare.loading, kSchemaNames);

@@ -7,6 +7,7 @@
 #include "client/files/TInputFile.h"
 #include "client/process/SystemError.h"
 #include "client/process/TClientError.h"
+#include "client/rules/FindRules.h"
 #include "client/rules/TSyntaxParser.h"
 #include "provider/DeltaNames.h"
 
@@ -61,8 +62,9 @@ void CheckContent(const TRulesText& rules)
 
 }  // namespace
 
-TRulesText ReadRules(const std::string& path)
+TRulesText ReadRules(const std::string& name)
 {
+    const std::string path = FindRules(name);
     CheckPath(path);
     TInputFile file(path);
     const TRulesText rules{file.GetName(), ReadWhole(file), false};
@@ -71,9 +73,9 @@ TRulesText ReadRules(const std::string& path)
     return rules;
 }
 
-std::optional<TRulesText> ReadRulesIfAny(const std::string& path)
+std::optional<TRulesText> ReadRulesIfAny(const std::string& name)
 {
-    return path.empty() ? std::nullopt : std::make_optional(ReadRules(path));
+    return name.empty() ? std::nullopt : std::make_optional(ReadRules(name));
 }
 
 }  // namespace NORVZEL20
