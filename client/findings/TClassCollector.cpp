@@ -59,16 +59,14 @@ void TClassCollector::AddWords(const std::string& property)
 
 void TClassCollector::AddPresence(const TDifference& difference)
 {
-    auto known = std::find_if(fFindings.presences.begin(), fFindings.presences.end(), [&](const TPresenceFinding& presence) {
-        return presence.kind == difference.kind && presence.inventories == difference.inventories;
-    });
-    if (known == fFindings.presences.end()) {
+    const auto [place, isNew] = fPresences.Add(difference);
+    if (isNew) {
         fFindings.presences.push_back({difference.kind, difference.inventories, 0, {}});
-        known = std::prev(fFindings.presences.end());
     }
-    known->instances += 1;
-    if (known->examples.size() < fMost) {
-        known->examples.push_back({fNames.Of(difference), difference.contents, difference.instance});
+    TPresenceFinding& presence = fFindings.presences[place];
+    presence.instances += 1;
+    if (presence.examples.size() < fMost) {
+        presence.examples.push_back({fNames.Of(difference), difference.contents, difference.instance});
         for (const auto& content : difference.contents) {
             AddWords(content.first);
         }

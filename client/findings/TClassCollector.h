@@ -9,6 +9,7 @@
 
 #include "client/comparison/TDifference.h"
 #include "client/findings/TClassFindings.h"
+#include "client/findings/TPresencePlaces.h"
 #include "client/findings/TShortNames.h"
 
 namespace NORVZEL20 {
@@ -65,6 +66,7 @@ class TClassCollector {
     TShortNames& fNames;
     const std::size_t fMost;
     TClassFindings fFindings;
+    TPresencePlaces<> fPresences;  // in fFindings.presences
     std::map<TWhere, TProperty> fProperties;
     std::string fInstance;  // of the last changed value
 };

@@ -1,7 +1,6 @@
 #include "client/report/html/TPageClassRows.h"
 
 #include <algorithm>
-#include <iterator>
 #include <utility>
 
 #include "client/findings/ChangeIdentity.h"
@@ -99,16 +98,14 @@ void TPageClassRows::Count(const TDifference& difference)
 
 void TPageClassRows::AddPresence(const TDifference& difference, std::size_t number)
 {
-    auto known = std::find_if(fPresences.begin(), fPresences.end(), [&difference](const TFinding& finding) {
-        return finding.page.kind == difference.kind && finding.inventories == difference.inventories;
-    });
-    if (known == fPresences.end()) {
+    const auto [place, isNew] = fPlaces.Add(difference);
+    if (isNew) {
         fPresences.emplace_back();
-        known = std::prev(fPresences.end());
-        known->page.kind = difference.kind;
+        fPresences.back().page.kind = difference.kind;
     }
-    const std::size_t content = AddContents(difference, known->page.example);
-    AddRow(*known, difference, difference.inventories, content, number);
+    TFinding& presence = fPresences[place];
+    const std::size_t content = AddContents(difference, presence.page.example);
+    AddRow(presence, difference, difference.inventories, content, number);
 }
 
 // The parts of a change stand for the whole.

@@ -10,6 +10,7 @@
 
 #include "client/comparison/TComparisonReport.h"
 #include "client/comparison/TDifference.h"
+#include "client/findings/TPresencePlaces.h"
 #include "client/findings/TShortNames.h"
 #include "client/report/html/TPageChanges.h"
 #include "client/report/html/TPageData.h"
@@ -85,6 +86,7 @@ class TPageClassRows {
     const std::size_t fInventories;
     std::map<std::string, TValueWords> fWords;  // by property
     std::vector<TFinding> fPresences;
+    TPresencePlaces<> fPlaces;                                                         // in fPresences
     std::map<std::pair<std::string, std::vector<std::size_t>>, TFinding> fProperties;  // by name and inventories
     std::vector<TInstance> fInstances;
     std::string fInstance;       // the key of the last one
