@@ -86,29 +86,23 @@ class TMarkdown {
 
     std::string Class(const TClassFindings& findings) const
     {
-        std::string text = "### " +
-                           EscapeForMarkdown(EscapeForDisplay(findings.className) + " " +
-                                             TClassLines(findings, fNames, fOptions, IsPair(), kMostShown).Counts()) +
-                           "\n\n";
+        TClassLines shortened(findings, fNames, fOptions, IsPair(), kMostShown);
+        TClassLines whole(findings, fNames, fOptions, IsPair(), kMostExamples);
+        std::string text = "### " + EscapeForMarkdown(EscapeForDisplay(findings.className) + " " + shortened.Counts()) + "\n\n";
         for (const TPresenceFinding& presence : findings.presences) {
-            TClassFindings part;
-            part.presences.push_back(presence);
-            AddPart(text, part);
+            AddFinding(text, shortened.WriteOne(presence), whole.WriteOne(presence));
         }
         for (const TPropertyFinding& property : findings.properties) {
-            TClassFindings part;
-            part.properties.push_back(property);
-            AddPart(text, part);
+            AddFinding(text, shortened.WriteOne(property), whole.WriteOne(property));
         }
         EndParagraph(text);
         return text;
     }
 
     // One finding: a list, folded if the text would shorten it.
-    void AddPart(std::string& text, const TClassFindings& part) const
+    static void AddFinding(std::string& text, const std::vector<TClassLines::TLine>& shortened,
+                           const std::vector<TClassLines::TLine>& whole)
     {
-        const std::vector<TClassLines::TLine> shortened = TClassLines(part, fNames, fOptions, IsPair(), kMostShown).Write();
-        const std::vector<TClassLines::TLine> whole = TClassLines(part, fNames, fOptions, IsPair(), kMostExamples).Write();
         std::string list;
         for (const TClassLines::TLine& line : whole) {
             list += "- " + MarkdownCode(line.contents.empty() ? line.text : line.text + "   " + line.contents) + "\n";

@@ -77,6 +77,20 @@ std::vector<TClassLines::TLine> TClassLines::Write()
     return std::move(fLines);
 }
 
+std::vector<TClassLines::TLine> TClassLines::WriteOne(const TPresenceFinding& presence)
+{
+    fLines.clear();
+    AddPresence(presence);
+    return std::move(fLines);
+}
+
+std::vector<TClassLines::TLine> TClassLines::WriteOne(const TPropertyFinding& property)
+{
+    fLines.clear();
+    AddProperty(property);
+    return std::move(fLines);
+}
+
 // Of too many groups, those that the fewest inventories are in, since they say who is odd.
 void TClassLines::AddPresences(TDifference::EKind kind)
 {
@@ -94,7 +108,7 @@ void TClassLines::AddPresences(TDifference::EKind kind)
         presences.resize(fMost);
     }
     for (const TPresenceFinding* const presence : presences) {
-        fIsPair ? AddPresenceOfPair(*presence) : AddPresence(*presence);
+        AddPresence(*presence);
     }
     if (rest > 0) {
         AddOtherPresences(kind, rest);
@@ -127,6 +141,11 @@ void TClassLines::AddProperties(std::vector<const TPropertyFinding*> ofOne)
 }
 
 void TClassLines::AddPresence(const TPresenceFinding& presence)
+{
+    fIsPair ? AddPresenceOfPair(presence) : AddPresenceOfFleet(presence);
+}
+
+void TClassLines::AddPresenceOfFleet(const TPresenceFinding& presence)
 {
     std::vector<std::string> names;
     for (const TPresenceFinding::TExample& example : presence.examples) {

@@ -30,10 +30,14 @@ class TClassLines {
     std::string Counts() const;
     /// The lines, those of instances that one side lacks first.
     std::vector<TLine> Write();
+    /// The lines of one of the findings.
+    std::vector<TLine> WriteOne(const TPresenceFinding& presence);
+    std::vector<TLine> WriteOne(const TPropertyFinding& property);
 
   private:
     void AddPresences(TDifference::EKind kind);
     void AddPresence(const TPresenceFinding& presence);
+    void AddPresenceOfFleet(const TPresenceFinding& presence);
     void AddOtherPresences(TDifference::EKind kind, std::size_t instances);
     void AddPresenceOfPair(const TPresenceFinding& presence);
     void AddProperties(std::vector<const TPropertyFinding*> ofOne);

@@ -554,6 +554,10 @@ TEST_F(MeaningTest, IsWrittenBesideTheNumber)
               "      ~ sda.States: {2 OK} -> {2 OK, 3 Degraded}\n"
               "      ~ sda.Uptime: 3 d 04:05:06 -> 3 d 04:05:07\n",
               Findings());
+    EXPECT_NE(std::string::npos, Compare({"-o", "markdown"})
+                                     .find("- `+ sdb   Health 99 Other, Size 1 GiB`\n"
+                                           "- `~ sda.Clock: 100 MHz -> 200 MHz`\n"
+                                           "- `~ sda.Health: 2 OK -> 7 \"Lost, all\"`\n"));
 }
 
 TEST_F(GroupedReportTest, FullShowsKeysAndValuesWhole)
