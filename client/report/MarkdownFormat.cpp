@@ -34,6 +34,7 @@
 #include "client/findings/CollectFindings.h"
 #include "client/report/BaselineText.h"
 #include "client/report/MarkdownText.h"
+#include "client/report/NamesOf.h"
 #include "client/report/ShortCoverage.h"
 #include "client/report/TClassLines.h"
 #include "client/report/TGroupedText.h"
@@ -51,7 +52,7 @@ constexpr std::size_t kMostShown = 8;
 class TMarkdown {
   public:
     TMarkdown(const TComparisonReport& report, const TFindings& findings, const TTextOptions& options)
-        : fReport(report), fFindings(findings), fOptions(options), fNames(report.labels)
+        : fReport(report), fFindings(findings), fOptions(options), fNames(NamesOf(report))
     {}
 
     void Write(const TTextSink& sink) const

@@ -18,8 +18,8 @@
 #include "client/report/ChangeText.h"
 #include "client/report/DescribeAgreement.h"
 #include "client/report/DisplayLabels.h"
+#include "client/report/NamesOf.h"
 #include "client/report/ShortCoverage.h"
-#include "client/report/TInventoryNames.h"
 #include "client/report/TextColors.h"
 #include "client/report/TextCoverage.h"
 #include "client/text/Counted.h"
@@ -96,7 +96,7 @@ std::string Rest(const TNoise& noise, const TUnexplained& rest)
 std::string Example(const TNoise& noise, const TNoiseRule& rule)
 {
     constexpr std::size_t kLongestExample = 60;
-    const std::string text = ChangeText(rule.example, TInventoryNames(noise.before.labels), noise.before.labels.size() == 2);
+    const std::string text = ChangeText(rule.example, NamesOf(noise.before), noise.before.labels.size() == 2);
     return std::string(TUtf8::Shorten(text, kLongestExample)) + (text.size() > kLongestExample ? "..." : "");
 }
 

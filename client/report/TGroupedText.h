@@ -4,6 +4,7 @@
 
 #include "client/comparison/TComparisonReport.h"
 #include "client/findings/TFindings.h"
+#include "client/report/NamesOf.h"
 #include "client/report/TInventoryNames.h"
 #include "client/report/TTextOptions.h"
 
@@ -14,7 +15,7 @@ class TGroupedText {
   public:
     /// The arguments must outlive this.
     TGroupedText(const TComparisonReport& report, const TFindings& findings, const TTextOptions& options)
-        : fReport(report), fFindings(findings), fOptions(options), fNames(report.labels, report.run != nullptr)
+        : fReport(report), fFindings(findings), fOptions(options), fNames(NamesOf(report))
     {}
 
     /// The whole text, coverage included. Errors: std::bad_alloc.

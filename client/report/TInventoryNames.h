@@ -10,10 +10,8 @@ namespace NORVZEL20 {
 class TInventoryNames {
   public:
     /// `labels` are those of the report, the reference first. They must outlive this. With `hasMajority`, the reference is none of
-    /// the inventories.
-    explicit TInventoryNames(const std::vector<std::string>& labels, bool hasMajority = false)
-        : fLabels(labels), fHasMajority(hasMajority)
-    {}
+    /// the inventories. See NamesOf.
+    TInventoryNames(const std::vector<std::string>& labels, bool hasMajority) : fLabels(labels), fHasMajority(hasMajority) {}
 
     /// The inventories as a short list, each shown as by DisplayLabel: `web02, web05`; three or more in a row that differ only in a
     /// number as `web21..23`; all but one or two of at least four others as `all but web07`; all of at least three others as `all`.

@@ -27,7 +27,7 @@
 #include "client/report/DescribeAgreement.h"
 #include "client/report/DescribeNotShown.h"
 #include "client/report/DisplayLabels.h"
-#include "client/report/TInventoryNames.h"
+#include "client/report/NamesOf.h"
 #include "client/report/TextCoverage.h"
 #include "client/report/html/Sha256.h"
 #include "client/report/html/TRuleProposals.h"
@@ -99,7 +99,7 @@ TJson ClassesOf(const TComparisonReport& report, const TPageData& data)
 
 TJson SetsOf(const TComparisonReport& report, const TPageSets& sets)
 {
-    const TInventoryNames names(report.labels);
+    const TInventoryNames names = NamesOf(report);
     TJson list = TJson::array();
     for (std::uint32_t i = 0; i < sets.GetCount(); ++i) {
         const std::vector<std::size_t>& inventories = sets.Get(i);

@@ -5,6 +5,7 @@
 #include <vector>
 
 #include "client/comparison/TValueDifference.h"
+#include "client/report/NamesOf.h"
 #include "client/report/TInventoryNames.h"
 #include "client/report/html/TPageData.h"
 #include "client/text/TValueWords.h"
@@ -15,7 +16,7 @@ namespace NORVZEL20 {
 class TPageChanges {
   public:
     /// Both must outlive this.
-    TPageChanges(TPageData& data, const std::vector<std::string>& labels) : fData(data), fNames(labels) {}
+    TPageChanges(TPageData& data, const TComparisonReport& report) : fData(data), fNames(NamesOf(report)) {}
 
     /// Adds a change and returns its number. Without `hasReference`, the reference lacks the instance.
     std::uint32_t Add(const TValueDifference& change, bool hasReference, const TValueWords& words);

@@ -32,7 +32,7 @@ bool SharesKeys(const TDifference& difference)
 
 TPageClassRows::TPageClassRows(const TComparisonReport& report, const TLacking& lacking, TShortNames& names, TPageData& data,
                                const std::string& className)
-    : fLacking(lacking), fNames(names), fData(data), fChanges(data, report.labels), fReportInventories(*report.inventories),
+    : fLacking(lacking), fNames(names), fData(data), fChanges(data, report), fReportInventories(*report.inventories),
       fInventories(report.labels.size())
 {
     fClass.name = className;

@@ -214,6 +214,17 @@ TEST_F(FleetReportTest, AReferenceThatIsOddItselfIsFoundByTheMajority)
               Compare(6, {"--reference", "majority"}));
 }
 
+TEST_F(FleetReportTest, WhatMostHaveIsNoInventory)
+{
+    for (const int system : {3, 4}) {
+        Drift(system, [](TMadeSystem& made) { made.Remove("KALMO_User", "www"); });
+    }
+    for (const char* const format : {"text", "markdown"}) {
+        const std::string report = Compare(4, {"--reference", "majority", "-o", format});
+        EXPECT_NE(std::string::npos, report.find("only in web01, web02: www")) << report;
+    }
+}
+
 TEST_F(FleetReportTest, OutliersAreShownByWhoTheyAreRarestFirst)
 {
     Drift(1, [](TMadeSystem& made) { made.Remove("KALMO_Package", "pkg1"); });

@@ -35,7 +35,7 @@ TEST(InventoryNamesTest, ListsAreAsShortAsTheyCanBe)
          "12345678901234567890, 12345678901234567891, 12345678901234567892"},
     };
     for (const auto& row : rows) {
-        EXPECT_EQ(row.list, TInventoryNames(row.labels).List(row.inventories));
+        EXPECT_EQ(row.list, TInventoryNames(row.labels, false).List(row.inventories));
     }
 }
 
