@@ -2,6 +2,7 @@
 
 #include <algorithm>
 #include <cstddef>
+#include <iterator>
 #include <string>
 #include <utility>
 #include <vector>
@@ -46,6 +47,18 @@ struct TDifference {
     std::size_t CountSharing(std::size_t inventory) const
     {
         return sharing.empty() || sharing[inventory] < 2 ? 0 : sharing[inventory];
+    }
+
+    /// Those of the reference and `inventories` in which instances share the key, ascending.
+    std::vector<std::size_t> GetSharing() const
+    {
+        std::vector<std::size_t> found;
+        if (CountSharing(0) > 0) {
+            found.push_back(0);
+        }
+        std::copy_if(inventories.begin(), inventories.end(), std::back_inserter(found),
+                     [this](std::size_t inventory) { return CountSharing(inventory) > 0; });
+        return found;
     }
 
     /// How many instances the difference is about: as many as the inventory has that has most instances with the key.

@@ -15,8 +15,8 @@ struct TChangeFinding {
     /// Some of them, in the order of the differences: the first ones, unless a property has more distinct changes than examples are
     /// kept. See TShortNames.
     std::vector<std::string> names;
-    std::vector<std::string> paths;  ///< the same, as TDifference::instance has them
-    bool isShared = false;           ///< whether instances of one inventory share a key in any of them
+    std::vector<std::string> paths;    ///< the same, as TDifference::instance has them
+    std::vector<std::size_t> sharing;  ///< the inventories in which several instances have the key of any of them, ascending
 };
 
 }  // namespace NORVZEL20

@@ -8,6 +8,7 @@
 
 #include <algorithm>
 #include <functional>
+#include <iterator>
 #include <tuple>
 #include <utility>
 
@@ -18,13 +19,11 @@ namespace NORVZEL20 {
 
 namespace {
 
-bool SharesKey(const TDifference& difference)
+void AddTo(std::vector<std::size_t>& inventories, const std::vector<std::size_t>& more)
 {
-    bool isShared = difference.CountSharing(0) > 0;
-    for (const std::size_t inventory : difference.inventories) {
-        isShared = isShared || difference.CountSharing(inventory) > 0;
-    }
-    return isShared;
+    std::vector<std::size_t> all;
+    std::set_union(inventories.begin(), inventories.end(), more.begin(), more.end(), std::back_inserter(all));
+    inventories = std::move(all);
 }
 
 }  // namespace
@@ -98,7 +97,7 @@ void TClassCollector::AddChange(const TDifference& difference, const TValueDiffe
     }
     property.kept[known.place].instances = known.instances;
     TChangeFinding& finding = property.examples[known.place];
-    finding.isShared = finding.isShared || SharesKey(difference);
+    AddTo(finding.sharing, difference.GetSharing());
     if (finding.names.size() < fMost) {
         finding.names.push_back(fNames.Of(difference));
         finding.paths.push_back(difference.instance);
@@ -110,7 +109,7 @@ void TClassCollector::Keep(TProperty& property, const TDigest& digest, TKnown& k
 {
     if (property.examples.size() < fMost) {
         known.place = property.examples.size();
-        property.examples.push_back({change, 0, {}, {}, false});
+        property.examples.push_back({change, 0, {}, {}, {}});
         property.kept.push_back({digest, 0});
         return;
     }
@@ -123,7 +122,7 @@ void TClassCollector::Keep(TProperty& property, const TDigest& digest, TKnown& k
     if (known.instances > least->instances) {
         std::swap(known.place, property.known[least->digest].place);
         least->digest = digest;
-        property.examples[known.place] = {change, 0, {}, {}, false};
+        property.examples[known.place] = {change, 0, {}, {}, {}};
     }
 }
 

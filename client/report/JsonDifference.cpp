@@ -18,6 +18,7 @@
 // "inventories".
 #include "client/report/JsonDifference.h"
 
+#include <algorithm>
 #include <utility>
 
 #include "client/report/JsonValue.h"
@@ -28,10 +29,17 @@ namespace {
 
 using TJson = nlohmann::ordered_json;
 
+TJson JsonOfSharing(const TComparisonReport& report, std::size_t inventory, std::size_t instances)
+{
+    return {{"inventory", report.labels[inventory]}, {"instances", instances}};
+}
+
 // Makes the parts of one difference, which are all made with its report.
 class TDifferenceWriter {
   public:
-    TDifferenceWriter(const TComparisonReport& report, const TDifference& difference) : fReport(report), fDifference(difference) {}
+    TDifferenceWriter(const TComparisonReport& report, const TDifference& difference)
+        : fReport(report), fDifference(difference), fSharing(difference.GetSharing())
+    {}
 
     TJson Write() const
     {
@@ -53,20 +61,11 @@ class TDifferenceWriter {
     }
 
   private:
-    TJson Sharing(std::size_t inventory, std::size_t instances) const
-    {
-        return {{"inventory", fReport.labels[inventory]}, {"instances", instances}};
-    }
-
     void AddSharing(TJson& json) const
     {
         TJson sharing = TJson::array();
-        std::vector<std::size_t> inventories = fDifference.inventories;
-        inventories.insert(inventories.begin(), 0);
-        for (const std::size_t i : inventories) {
-            if (fDifference.CountSharing(i) > 0) {
-                sharing.push_back(Sharing(i, fDifference.CountSharing(i)));
-            }
+        for (const std::size_t inventory : fSharing) {
+            sharing.push_back(JsonOfSharing(fReport, inventory, fDifference.CountSharing(inventory)));
         }
         AddJsonList(json, "sharing", std::move(sharing));
     }
@@ -102,29 +101,16 @@ class TDifferenceWriter {
         }
         TJson others = TJson::array();
         for (const TValueDifference::TGroup& group : values.others) {
-            others.push_back(Group(group));
+            others.push_back(JsonOfGroup(fReport, group, fSharing));
         }
         AddJsonList(json, "others", std::move(others));
         AddJsonList(json, "parts", Values(values.parts));
         return json;
     }
 
-    TJson Group(const TValueDifference::TGroup& group) const
-    {
-        TJson json = {{"inventories", JsonOfLabels(fReport, group.inventories)}};
-        json.update(JsonWithType(group.value));
-        TJson sharing = TJson::array();
-        for (std::size_t i = 0; i < group.inventories.size(); ++i) {
-            if (fDifference.CountSharing(group.inventories[i]) > 0) {
-                sharing.push_back(Sharing(group.inventories[i], group.CountInstances(i)));
-            }
-        }
-        AddJsonList(json, "sharing", std::move(sharing));
-        return json;
-    }
-
     const TComparisonReport& fReport;
     const TDifference& fDifference;
+    const std::vector<std::size_t> fSharing;
 };
 
 }  // namespace
@@ -148,6 +134,21 @@ nlohmann::ordered_json JsonOfLabels(const TComparisonReport& report, const std::
         labels.push_back(report.labels[inventory]);
     }
     return labels;
+}
+
+nlohmann::ordered_json JsonOfGroup(const TComparisonReport& report, const TValueDifference::TGroup& group,
+                                   const std::vector<std::size_t>& sharing)
+{
+    TJson json = {{"inventories", JsonOfLabels(report, group.inventories)}};
+    json.update(JsonWithType(group.value));
+    TJson counts = TJson::array();
+    for (std::size_t i = 0; i < group.inventories.size(); ++i) {
+        if (std::binary_search(sharing.begin(), sharing.end(), group.inventories[i])) {
+            counts.push_back(JsonOfSharing(report, group.inventories[i], group.CountInstances(i)));
+        }
+    }
+    AddJsonList(json, "sharing", std::move(counts));
+    return json;
 }
 
 nlohmann::ordered_json JsonOfDifference(const TComparisonReport& report, const TDifference& difference)

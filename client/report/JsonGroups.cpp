@@ -2,14 +2,15 @@
 //
 //   { "class": "Package", "kind": "onlyInReference", "inventories": [ "web02" ], "instances": 2,
 //     "examples": [ "Package.Name=\"font11\"", "Package.Name=\"libdev5\"" ] }
-//   { "class": "Package", "kind": "changed", "property": "Version", "inventories": [ "web02" ], "instances": 43, "distinctChanges":
-//   42,
+//   { "class": "Package", "kind": "changed", "property": "Version", "inventories": [ "web02" ], "instances": 43,
+//     "distinctChanges": 42,
 //     "changes": [ { "instances": 2, "reference": { "type": "string", "value": "1.0" },
 //                    "others": [ { "inventories": [ "web02" ], "type": "string", "value": "1.1" } ],
 //                    "examples": [ "Package.Name=\"curl\"", "Package.Name=\"libcurl4\"" ] } ] }
 //
 // "examples" and "changes" hold some of what "instances" and "distinctChanges" count. The differences have all of it, with the same
-// texts as "instance". In "others", "sharing" is as it is there.
+// texts as "instance". In "others", "sharing" is as it is there; it names an inventory if in any of the differences several of its
+// instances have the key.
 #include "client/report/JsonGroups.h"
 
 #include <string>
@@ -37,23 +38,11 @@ TJson JsonOfPresence(const TComparisonReport& report, const std::string& classNa
             {"examples", std::move(examples)}};
 }
 
-TJson JsonOfOthers(const TComparisonReport& report, const TValueDifference::TGroup& group)
-{
-    TJson json = {{"inventories", JsonOfLabels(report, group.inventories)}};
-    json.update(JsonWithType(group.value));
-    TJson sharing = TJson::array();
-    for (std::size_t i = 0; i < group.instances.size(); ++i) {
-        sharing.push_back({{"inventory", report.labels[group.inventories[i]]}, {"instances", group.instances[i]}});
-    }
-    AddJsonList(json, "sharing", std::move(sharing));
-    return json;
-}
-
 TJson JsonOfChange(const TComparisonReport& report, const TChangeFinding& finding)
 {
     TJson others = TJson::array();
     for (const TValueDifference::TGroup& group : finding.change.others) {
-        others.push_back(JsonOfOthers(report, group));
+        others.push_back(JsonOfGroup(report, group, finding.sharing));
     }
     return {{"instances", finding.instances},
             {"reference", JsonWithType(finding.change.reference)},

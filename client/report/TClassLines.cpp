@@ -247,7 +247,7 @@ std::string TClassLines::ExampleOf(const TPropertyFinding& property) const
 std::string TClassLines::Change(const TChangeFinding& change, bool isPair) const
 {
     const TChangeStyle style{isPair, fOptions.hasWholeKeys, fMost, fFindings.WordsFor(change.change.property)};
-    return ChangeText(change.change, fNames, style) + (change.isShared ? kSharesKey : "");
+    return ChangeText(change.change, fNames, style) + (change.sharing.empty() ? "" : kSharesKey);
 }
 
 // Names of several keys have commas in them.

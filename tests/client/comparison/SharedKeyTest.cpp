@@ -1,3 +1,5 @@
+#include <nlohmann/json.hpp>
+
 #include "tests/client/TDocumentsFixture.h"
 
 namespace NORVZEL20 {
@@ -94,6 +96,16 @@ TEST_F(SharedKeyTest, OnlyAClassWhoseRulesExcludeKeysHasPaths)
     const std::string records = Compare(documents, {"-o", "cimxml"});
     EXPECT_NE(std::string::npos, records.find("<VALUE>Tape.Id=\"t\"</VALUE>")) << records;
     EXPECT_NE(std::string::npos, records.find("<VALUE>root/cimv2:Disk.Boot=\"1\",Id=\"sda\"</VALUE>")) << records;
+}
+
+TEST_F(SharedKeyTest, AGroupNamesOnlyInventoriesWithSharedKeys)
+{
+    const std::string report =
+        Compare({Declared() + OfSize("1", "5"), Declared() + OfSize("2", "9") + OfSize("3", "9"), Declared() + OfSize("4", "9")},
+                {"-o", "json"});
+    const nlohmann::ordered_json document = nlohmann::ordered_json::parse(report);
+    EXPECT_EQ(R"([{"inventory":"b","instances":2}])", document["differences"][0]["others"][0]["sharing"].dump());
+    EXPECT_EQ(document["differences"][0]["others"], document["groups"][0]["changes"][0]["others"]);
 }
 
 TEST_F(SharedKeyTest, InstancesThatTheReferenceLacksAreAllNamed)
