@@ -1,20 +1,22 @@
 // The overview, with one element of each list:
 //
 //   { "verdict": "web01 against 7 others: 56 differences",
-//     "counts": { "differences": 56, "onlyInReference": 2, "onlyInOthers": 1, "changedValues": 53 },
+//     "counts": { "differences": 56, "onlyInReference": 2, "onlyInOthers": 1, "changedValues": 53, "changedInstances": 50 },
 //     "notShown": "3 changed values not shown (--only +)", "reference": 0,
 //     "inventories": [ { "label": "web01", "file": "web01.xml", "instances": 330, "namespace": "root/cimv2", "differences": 0 } ],
-//     "classes": [ { "name": "Disk", "onlyInReference": 0, "onlyInOthers": 0, "changedValues": 1, "compared": [ 5, 5 ],
-//                    "differences": [ 0, 1 ], "instances": [ 0, 1 ] } ],
+//     "classes": [ { "differences": 1, "onlyInReference": 0, "onlyInOthers": 0, "changedValues": 1, "changedInstances": 1,
+//                    "name": "Disk", "compared": [ 5, 5 ], "byInventory": [ 0, 1 ], "instances": [ 0, 1 ] } ],
 //     "comparedClasses": 9,
 //     "sets": [ { "inventories": [ 1, 2 ], "text": "web02, web03" } ],
 //     "findings": [ { "kind": 2, "class": 0, "property": "Size", "set": 1, "first": 0, "rows": 1, "changes": 1, "rarity": 1,
-//                     "example": { "names": [ "sda" ], "reference": "500", "others": [ [ "250", 1 ] ], "short": "" },
+//                     "example": { "names": [ "sda" ], "contents": [], "reference": "500", "others": [ [ "250", 1 ] ],
+//                                  "short": "" },
 //                     "rule": { "what": "...", "place": "...", "xml": "..." } } ],
 //     "rules": { "name": "rules.xml", "isMade": false, "options": "", "digest": "9f86...", "text": "..." },
 //     "baseline": [ "2 differences are new ..." ], "coverage": [ "Compared: ..." ] }
 //
-// "compared", "differences" and "instances" have a number for each inventory. The kinds are those of TDifference.
+// "compared", "byInventory" (differences) and "instances" have a number for each inventory. "contents" has the properties and
+// values of an instance that came or went: [ "Size", "500" ]. The kinds are those of TDifference.
 #include "client/report/html/PageOverview.h"
 
 #include <algorithm>
