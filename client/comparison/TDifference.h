@@ -49,6 +49,12 @@ struct TDifference {
         return sharing.empty() || sharing[inventory] < 2 ? 0 : sharing[inventory];
     }
 
+    /// Whether instances of any inventory of the run share the key, those that agree with the reference included.
+    bool IsKeyShared() const
+    {
+        return std::any_of(sharing.begin(), sharing.end(), [](std::size_t count) { return count > 1; });
+    }
+
     /// Those of the reference and `inventories` in which instances share the key, ascending.
     std::vector<std::size_t> GetSharing() const
     {

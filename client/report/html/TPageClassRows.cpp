@@ -23,11 +23,6 @@ std::size_t FewestIn(const TValueDifference& change)
     return fewest;
 }
 
-bool SharesKeys(const TDifference& difference)
-{
-    return std::any_of(difference.sharing.begin(), difference.sharing.end(), [](std::size_t count) { return count > 1; });
-}
-
 }  // namespace
 
 TPageClassRows::TPageClassRows(const TComparisonReport& report, const TLacking& lacking, TShortNames& names, TPageData& data,
@@ -66,7 +61,7 @@ void TPageClassRows::AddInstance(const TDifference& difference)
     } else if (difference.kind == TDifference::kOnlyInReference) {
         instance.lacking = fData.sets.Add(difference.inventories);
     }
-    if (SharesKeys(difference)) {
+    if (difference.IsKeyShared()) {  // a page shows the inventories that agree as well
         instance.sharing = fChanges.AddList(difference.sharing);
     }
     if (!difference.path.empty()) {
