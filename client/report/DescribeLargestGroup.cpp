@@ -1,6 +1,7 @@
 #include "client/report/DescribeLargestGroup.h"
 
 #include "client/text/DisplayText.h"
+#include "client/text/QuoteForShell.h"
 
 namespace NORVZEL20 {
 
@@ -39,7 +40,7 @@ std::string DescribeLargestGroup(const TFindings& findings, std::size_t total)
         return std::string();
     }
     return std::to_string(largest.count) + " of " + std::to_string(total) + " differences are " + EscapeForDisplay(largest.what) +
-           ": --exclude " + EscapeForDisplay(largest.excluded) + "\n";
+           ": --exclude " + EscapeForDisplay(QuoteForShell(largest.excluded)) + "\n";
 }
 
 }  // namespace NORVZEL20

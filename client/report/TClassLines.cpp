@@ -23,6 +23,7 @@
 #include "client/text/Counted.h"
 #include "client/text/DisplayText.h"
 #include "client/text/ListedText.h"
+#include "client/text/QuoteForShell.h"
 
 namespace NORVZEL20 {
 
@@ -229,9 +230,9 @@ std::string TClassLines::First(const TChangeFinding& change)
 std::string TClassLines::MoreChanges(const TPropertyFinding& property) const
 {
     const bool isEnough = property.changes <= kMostExamples && !fOptions.hasWholeGroups;
+    const std::string name = property.property.substr(0, property.property.find('.'));
     return "... " + std::to_string(property.changes - 1) + " more (" +
-           (isEnough ? "--property " + EscapeForDisplay(property.property.substr(0, property.property.find('.'))) : "--detail") +
-           ")";
+           (isEnough ? "--property " + EscapeForDisplay(QuoteForShell(name)) : "--detail") + ")";
 }
 
 // The first change. Its inventories are left out if they are those of the property, which stand above it.

@@ -14,6 +14,7 @@
 #include "client/text/DisplayText.h"
 #include "client/text/MatchesWildcards.h"
 #include "client/text/NearestWord.h"
+#include "client/text/QuoteForShell.h"
 #include "client/text/SomeOf.h"
 
 namespace NORVZEL20 {
@@ -164,10 +165,10 @@ class TSelector {
         }
         const std::string name = typed.className.value_or("*");
         const std::string advice =
-            isProperty
-                ? "; for the property, write " + (typed.option == "--class" ? "--property " + EscapeForDisplay(name)
-                                                                            : typed.option + " '*." + EscapeForDisplay(name) + "'")
-                : Suggest(name, names);
+            isProperty ? "; for the property, write " + EscapeForDisplay(typed.option == "--class"
+                                                                             ? "--property " + QuoteForShell(name)
+                                                                             : typed.option + " " + QuoteForShell("*." + name))
+                       : Suggest(name, names);
         throw TClientError(typed.Show() + ": the reference declares no such class" + advice);
     }
 
