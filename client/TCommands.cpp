@@ -162,7 +162,7 @@ void TCommands::AddNoise()
     AddText(command, "--spec", fNoise.rules,
             "a rules file to start from, or - for standard input (default: everything is compared)")
         ->option_text("RULES");
-    AddFormat(command, fNoise.format, {"text", "json"});
+    AddFormat(command, fNoise.format, NoiseFormatNames());
     AddLoadingOptions(command, fNoise.loading, kSchemaNames);
     AddSystemNames(command, fNoise.systems);
     AddSaveRules(command, fNoise.savedRules);

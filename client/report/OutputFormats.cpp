@@ -6,21 +6,36 @@ namespace NORVZEL20 {
 
 namespace {
 
-const struct {
+struct TFormatName {
     const char* name;
     EOutputFormat format;
     bool isForListings;
-} kFormats[] = {{"text", EOutputFormat::kText, true},     {"json", EOutputFormat::kJson, true},
-                {"ndjson", EOutputFormat::kNdjson, true}, {"cimxml", EOutputFormat::kCimXml, true},
-                {"csv", EOutputFormat::kCsv, false},      {"markdown", EOutputFormat::kMarkdown, false},
-                {"html", EOutputFormat::kHtml, false}};
+    bool isForNoise;
+};
+
+const TFormatName kFormats[] = {
+    {"text", EOutputFormat::kText, true, true},      {"json", EOutputFormat::kJson, true, true},
+    {"ndjson", EOutputFormat::kNdjson, true, false}, {"cimxml", EOutputFormat::kCimXml, true, false},
+    {"csv", EOutputFormat::kCsv, false, false},      {"markdown", EOutputFormat::kMarkdown, false, false},
+    {"html", EOutputFormat::kHtml, false, false}};
+
+std::vector<std::string> NamesFor(bool TFormatName::*isFor)
+{
+    std::vector<std::string> names;
+    for (const TFormatName& format : kFormats) {
+        if (format.*isFor) {
+            names.emplace_back(format.name);
+        }
+    }
+    return names;
+}
 
 }  // namespace
 
 std::vector<std::string> ReportFormatNames()
 {
     std::vector<std::string> names;
-    for (const auto& format : kFormats) {
+    for (const TFormatName& format : kFormats) {
         names.emplace_back(format.name);
     }
     return names;
@@ -28,18 +43,17 @@ std::vector<std::string> ReportFormatNames()
 
 std::vector<std::string> ListingFormatNames()
 {
-    std::vector<std::string> names;
-    for (const auto& format : kFormats) {
-        if (format.isForListings) {
-            names.emplace_back(format.name);
-        }
-    }
-    return names;
+    return NamesFor(&TFormatName::isForListings);
+}
+
+std::vector<std::string> NoiseFormatNames()
+{
+    return NamesFor(&TFormatName::isForNoise);
 }
 
 EOutputFormat OutputFormatOf(const std::string& name)
 {
-    for (const auto& format : kFormats) {
+    for (const TFormatName& format : kFormats) {
         if (name == format.name) {
             return format.format;
         }

@@ -11,6 +11,7 @@ TEST(OutputFormats, HaveNamesInTheOrderOfMessages)
 {
     EXPECT_EQ((std::vector<std::string>{"text", "json", "ndjson", "cimxml", "csv", "markdown", "html"}), ReportFormatNames());
     EXPECT_EQ((std::vector<std::string>{"text", "json", "ndjson", "cimxml"}), ListingFormatNames());
+    EXPECT_EQ((std::vector<std::string>{"text", "json"}), NoiseFormatNames());
     EXPECT_EQ(EOutputFormat::kText, OutputFormatOf("text"));
     EXPECT_EQ(EOutputFormat::kJson, OutputFormatOf("json"));
     EXPECT_EQ(EOutputFormat::kNdjson, OutputFormatOf("ndjson"));
