@@ -12,7 +12,6 @@
 
 #include <string>
 #include <string_view>
-#include <vector>
 
 #include "client/findings/TShortNames.h"
 #include "client/report/JsonDifference.h"

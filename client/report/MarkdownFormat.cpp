@@ -22,7 +22,6 @@
 // A group that the text would shorten is folded, with all of its examples in it. What comes from inventories stands as code, in
 // which nothing has a meaning, except in headings and in the last lines, where it is escaped.
 #include "client/report/MarkdownFormat.h"
-#include "client/report/DescribeNotShown.h"
 
 #include <boost/algorithm/string/classification.hpp>
 #include <boost/algorithm/string/predicate.hpp>
@@ -33,6 +32,7 @@
 
 #include "client/findings/CollectFindings.h"
 #include "client/report/BaselineText.h"
+#include "client/report/DescribeNotShown.h"
 #include "client/report/MarkdownText.h"
 #include "client/report/NamesOf.h"
 #include "client/report/ShortCoverage.h"

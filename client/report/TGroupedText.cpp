@@ -29,7 +29,6 @@
 #include "client/report/DescribeAgreement.h"
 #include "client/report/DescribeLargestGroup.h"
 #include "client/report/DescribeNotShown.h"
-#include "client/report/DisplayLabels.h"
 #include "client/report/ShortCoverage.h"
 #include "client/report/TClassLines.h"
 #include "client/report/TClassTable.h"

@@ -19,7 +19,6 @@
 // values of an instance that came or went: [ "Size", "500" ]. The kinds are those of TDifference.
 #include "client/report/html/PageOverview.h"
 
-#include <algorithm>
 #include <boost/algorithm/string/classification.hpp>
 #include <boost/algorithm/string/split.hpp>
 #include <boost/algorithm/string/trim.hpp>
@@ -28,7 +27,6 @@
 #include "client/report/BaselineText.h"
 #include "client/report/DescribeAgreement.h"
 #include "client/report/DescribeNotShown.h"
-#include "client/report/DisplayLabels.h"
 #include "client/report/NamesOf.h"
 #include "client/report/TextCoverage.h"
 #include "client/report/html/Sha256.h"

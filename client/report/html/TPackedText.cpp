@@ -1,6 +1,5 @@
 #include "client/report/html/TPackedText.h"
 
-#include <algorithm>
 #include <limits>
 #include <new>
 

@@ -2,7 +2,6 @@
 
 #include "client/report/ChangeText.h"
 #include "client/report/TValueTexts.h"
-#include "client/text/DisplayText.h"
 #include "embedded/value/TUtf8.h"
 
 namespace NORVZEL20 {
