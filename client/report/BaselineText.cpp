@@ -1,6 +1,6 @@
 // The first line is there unless all is as it was accepted; the others say what the differences of the report do not:
 //
-//   Beside base.txt: 1 new, 1 changed since, 1 gone; 37 accepted
+//   Compared with base.txt: 1 new, 1 changed since, 1 gone; 37 accepted
 //     changed  ~ INV_Package.Name="bash" Version: "5.1" -> "5.3" in web02; accepted: "5.1" -> "5.2"
 //     gone     + INV_Package.Name="curl" in web03
 //   2 accepted differences are for inventories that are not in this run: web09
@@ -36,7 +36,7 @@ std::string Verdict(const TBaselineOutcome& outcome)
     add(outcome.gone.size(), outcome.isAccepting ? " gone and removed" : " gone");
     const std::string changes = parts.empty() ? "nothing new" : boost::algorithm::join(parts, ", ");
     return outcome.isAccepting ? "Accepted in " + file + ": " + changes + "; " + std::to_string(outcome.accepted) + " as before"
-                               : "Beside " + file + ": " + changes + "; " + std::to_string(outcome.accepted) + " accepted";
+                               : "Compared with " + file + ": " + changes + "; " + std::to_string(outcome.accepted) + " accepted";
 }
 
 // The entry without values, of which an instance can have many.

@@ -122,7 +122,7 @@ TEST_F(BaselineTest, OnlyWhatIsNewIsReported)
               "Disk  + sdc   Size 7\n"
               "      ~ sdb.Size: 5 -> 6\n"
               "\n"
-              "Beside base.txt: 2 new; 1 accepted\n",
+              "Compared with base.txt: 2 new; 1 accepted\n",
               Since());
     EXPECT_EQ(1, fStatus);
 }
@@ -137,7 +137,7 @@ TEST_F(BaselineTest, AnotherValueThanAcceptedIsReportedWithBoth)
               "Disk  + sdc   Size 8\n"
               "      ~ sda.Size: 1 -> 3\n"
               "\n"
-              "Beside base.txt: 2 changed since; 0 accepted\n"
+              "Compared with base.txt: 2 changed since; 0 accepted\n"
               "  changed  ~ Disk.Id=\"sda\" Size: uint16 1 -> uint16 3 in web02; accepted: uint16 1 -> uint16 2\n"
               "  changed  + Disk.Id=\"sdc\" in web02; has Size: uint16 8; accepted: Size: uint16 7\n",
               Since());
@@ -161,7 +161,7 @@ TEST_F(BaselineTest, WhatIsGoneIsListedAndIsNoDifference)
     System("web02", {{"sda", "2"}, {"sdb", "5"}});
     EXPECT_EQ("Nothing new between web01 and web02 since base.txt: 1 accepted difference.\n"
               "\n"
-              "Beside base.txt: 2 gone; 1 accepted\n"
+              "Compared with base.txt: 2 gone; 1 accepted\n"
               "  gone     - Disk.Id=\"sdb\" in web02\n"
               "  gone     + Disk.Id=\"sdc\" in web02\n",
               Since());
@@ -179,7 +179,7 @@ TEST_F(BaselineTest, OfAPartlyAcceptedDifferenceOnlyTheNewInventoriesAreReported
               "\n"
               "Disk  ~1   sda.Size: 1 -> 2 (web03)\n"
               "\n"
-              "Beside base.txt: 1 new; 0 accepted\n",
+              "Compared with base.txt: 1 new; 0 accepted\n",
               Since());
 }
 
@@ -253,7 +253,7 @@ TEST_F(BaselineTest, AnEmptyBaselineLeavesTheReportAsItIs)
         EXPECT_EQ(plain.substr(0, end), beside.substr(0, beside.find("\"baseline\"")).substr(0, end));
         EXPECT_EQ(1, fStatus);
     }
-    EXPECT_EQ("\nBeside base.txt: 4 new; 0 accepted\n", Since().substr(Compare({}).rfind("\n\n") + 1));
+    EXPECT_EQ("\nCompared with base.txt: 4 new; 0 accepted\n", Since().substr(Compare({}).rfind("\n\n") + 1));
 }
 
 TEST_F(BaselineTest, JoinedFilesOfTwoPeopleAreTheUnionOfBoth)
