@@ -6,10 +6,10 @@
 
 namespace NORVZEL20 {
 
-/// What an inventory lacks, in few words: `instances: Fan, Sensor (CIM_ERR_FAILED (1), "crashed")`.
+/// What an inventory lacks, in few words: `instances: Fan, Sensor, Disk and 5 more (CIM_ERR_FAILED (1), "crashed")`.
 std::string DescribeLack(const TNotCollected& lack);
 
-/// The same with every name that the inventory has: `instances: Fan, Sensor (CIM_ERR_FAILED (1), "crashed")`.
+/// The same with every name that the inventory has: `instances: Fan, Sensor, Disk, Port, Tape and 3 more (...)`.
 std::string DescribeLackWholly(const TNotCollected& lack);
 
 }  // namespace NORVZEL20
