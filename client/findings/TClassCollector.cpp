@@ -60,10 +60,11 @@ void TClassCollector::AddPresence(const TDifference& difference)
 {
     const auto [place, isNew] = fPresences.Add(difference);
     if (isNew) {
-        fFindings.presences.push_back({difference.kind, difference.inventories, 0, {}});
+        fFindings.presences.push_back({difference.kind, difference.inventories, 0, 0, {}});
     }
     TPresenceFinding& presence = fFindings.presences[place];
     presence.instances += 1;
+    presence.disagreeing += difference.values.empty() ? 0 : 1;
     if (presence.examples.size() < fMost) {
         presence.examples.push_back({fNames.Of(difference), difference.contents, difference.instance});
         for (const auto& content : difference.contents) {

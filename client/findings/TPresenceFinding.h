@@ -21,6 +21,7 @@ struct TPresenceFinding {
     TDifference::EKind kind;               ///< kOnlyInReference or kOnlyInOthers
     std::vector<std::size_t> inventories;  ///< see TDifference::inventories
     std::size_t instances = 0;
+    std::size_t disagreeing = 0;     ///< of how many of them the inventories that have them hold different values
     std::vector<TExample> examples;  ///< the first of them, in the order of the differences
 };
 

@@ -20,7 +20,7 @@ constexpr std::size_t kFewestForMajority = 3;
     words.emplace_back(kMajorityLabel);
     const std::string nearest = NearestWord(name, words);
     throw TClientError("no inventory is called " + EscapeForDisplay(name) +
-                       (nearest.empty() ? std::string() : "; did you mean " + nearest + "?") +
+                       (nearest.empty() ? std::string(".") : "; did you mean " + nearest + "?") +
                        " For --reference give one of these labels, or majority: " + SomeOf(labels));
 }
 

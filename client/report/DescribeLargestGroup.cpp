@@ -1,7 +1,10 @@
+// An option reaches the classes below the one that it names, so a group is what the option leaves out: the differences of the class
+// and of those below it. It is a group of one property, or of the instances that not all have.
 #include "client/report/DescribeLargestGroup.h"
 
 #include "client/text/DisplayText.h"
 #include "client/text/QuoteForShell.h"
+#include "embedded/store/TInMemClass.h"
 
 namespace NORVZEL20 {
 
@@ -16,27 +19,72 @@ struct TLargest {
     std::string excluded;
 };
 
-void Take(TLargest& largest, std::size_t count, const std::string& what, const std::string& excluded)
+using TTree = std::vector<const TClassFindings*>;
+
+// What was found in the class and below it.
+TTree TreeOf(const TInMemNamespace& schema, const TFindings& findings, const std::string& className)
+{
+    TTree tree;
+    for (const TClassFindings& cls : findings.classes) {
+        const boost::shared_ptr<TInMemClass> declared = schema.FindClass(cls.className);
+        if (cls.className == className || (declared && declared->IsSubclassOf(className))) {
+            tree.push_back(&cls);
+        }
+    }
+    return tree;
+}
+
+std::size_t CountPresences(const TTree& tree)
+{
+    std::size_t count = 0;
+    for (const TClassFindings* const cls : tree) {
+        count += cls->counts.onlyInReference + cls->counts.onlyInOthers;
+    }
+    return count;
+}
+
+std::size_t CountChanges(const TTree& tree, const std::string& property)
+{
+    std::size_t count = 0;
+    for (const TClassFindings* const cls : tree) {
+        const auto found = cls->changedProperties.find(property);
+        count += found == cls->changedProperties.end() ? 0 : found->second;
+    }
+    return count;
+}
+
+std::size_t CountAll(const TTree& tree)
+{
+    std::size_t count = 0;
+    for (const TClassFindings* const cls : tree) {
+        count += cls->counts.GetTotal();
+    }
+    return count;
+}
+
+void Take(TLargest& largest, std::size_t count, const TTree& tree, const std::string& what, const std::string& name)
 {
     if (count > largest.count) {
-        largest = {count, what, excluded};
+        largest = {count, what + (tree.size() > 1 ? " and classes below it" : ""), name};
     }
 }
 
 }  // namespace
 
-std::string DescribeLargestGroup(const TFindings& findings, std::size_t total)
+std::string DescribeLargestGroup(const TInMemNamespace& schema, const TFindings& findings, std::size_t total)
 {
     TLargest largest;
     for (const TClassFindings& cls : findings.classes) {
-        Take(largest, cls.counts.onlyInReference + cls.counts.onlyInOthers, "instances of " + cls.className + " that not all have",
-             cls.className);
-        for (const auto& [property, count] : cls.changedProperties) {
-            const std::string name = cls.className + "." + property;
-            Take(largest, count, name, name);
+        const TTree tree = TreeOf(schema, findings, cls.className);
+        if (CountPresences(tree) * 2 > total) {
+            Take(largest, CountAll(tree), tree, "in " + cls.className, cls.className);
+        }
+        for (const auto& changed : cls.changedProperties) {
+            const std::string name = cls.className + "." + changed.first;
+            Take(largest, CountChanges(tree, changed.first), tree, name, name);
         }
     }
-    if (largest.count <= kFew || largest.count * 2 <= total) {
+    if (largest.count <= kFew || largest.count * 2 <= total || largest.count == total) {
         return std::string();
     }
     return std::to_string(largest.count) + " of " + std::to_string(total) + " differences are " + EscapeForDisplay(largest.what) +

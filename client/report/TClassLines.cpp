@@ -154,7 +154,17 @@ void TClassLines::AddPresenceOfFleet(const TPresenceFinding& presence)
     }
     const std::string who = presence.kind == TDifference::kOnlyInReference ? fNames.WhoLacks(presence.inventories)
                                                                            : fNames.WhoHas(presence.inventories);
-    fLines.push_back({who + ": " + Shorten(names, presence.instances), presence.kind});
+    fLines.push_back({who + ": " + Shorten(names, presence.instances) + Disagreement(presence), presence.kind});
+}
+
+// Only one of the values could be shown.
+std::string TClassLines::Disagreement(const TPresenceFinding& presence)
+{
+    if (presence.disagreeing == 0) {
+        return std::string();
+    }
+    const std::string whose = presence.instances == 1 ? "its values" : "values of " + std::to_string(presence.disagreeing);
+    return "   (" + whose + " differ among them: --detail)";
 }
 
 void TClassLines::AddPresenceOfPair(const TPresenceFinding& presence)

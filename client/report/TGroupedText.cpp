@@ -51,7 +51,7 @@ std::string TGroupedText::Write() const
     }
     text += WriteBaselineText(fReport, fOptions);
     return text + "\n" + (fOptions.hasWholeCoverage ? WriteTextCoverage(fReport) : WriteShortCoverage(fReport)) +
-           DescribeLargestGroup(fFindings, fReport.differences->GetCounts().GetTotal());
+           DescribeLargestGroup(*fReport.inventories->front().ns, fFindings, fReport.differences->GetCounts().GetTotal());
 }
 
 std::string TGroupedText::Summary() const

@@ -37,6 +37,23 @@ TEST_F(DisagreementTest, JsonHasThemInAFieldOfTheirOwn)
               Lines({User(), WithUid("1004"), WithUid("0")}));
 }
 
+TEST_F(DisagreementTest, AGroupedReportSaysThatThereAreSome)
+{
+    const auto findings = [this](const std::vector<std::string>& documents) {
+        std::vector<std::string> arguments{"compare"};
+        for (const std::string& contents : documents) {
+            const std::string name(1, static_cast<char>('a' + arguments.size() - 1));
+            arguments.push_back(name + "=" + Scratch(name + ".xml", Document(System() + contents)));
+        }
+        const std::string report = Result(arguments);
+        const std::size_t begin = report.find("User  ");
+        return report.substr(begin, report.find('\n', begin) - begin);
+    };
+    EXPECT_EQ("User  +1   only in b, c: web   (its values differ among them: --detail)",
+              findings({User(), WithUid("1004"), WithUid("0")}));
+    EXPECT_EQ("User  +1   only in b, c: web", findings({User(), WithUid("5"), WithUid("5")}));
+}
+
 TEST_F(DisagreementTest, EqualInstancesAreShownByTheirKeyAlone)
 {
     EXPECT_EQ("User\n+ Name=\"web\"  (in b, c)\n", Differences({User(), WithUid("5"), WithUid("5")}));
