@@ -99,7 +99,7 @@ std::string ElementsChanged(const TCIMValue& from, const TCIMValue& to)
 
 // The text of a value. If all values are plain ones of one type, they are quoted as this line and lists need it; otherwise
 // TValueTexts has found what tells them apart.
-std::string Shown(const TCIMValue& value, const TValueDifference& change, const std::string& text, const TValueWords& words)
+std::string Shown(const TCIMValue& value, const TValueDifference& change, const std::string& text, const TValueWords* words)
 {
     bool arePlain = !HasEmbeddedObject(change.reference);
     for (const TValueDifference::TGroup& group : change.others) {
@@ -108,7 +108,7 @@ std::string Shown(const TCIMValue& value, const TValueDifference& change, const 
     if (!arePlain) {
         return text;
     }
-    const std::string described = words.Describe(value);
+    const std::string described = words == nullptr ? std::string() : words->Describe(value);
     if (!described.empty()) {
         return described;
     }

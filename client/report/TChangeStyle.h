@@ -8,10 +8,10 @@ namespace NORVZEL20 {
 
 /// How ChangeText writes a change.
 struct TChangeStyle {
-    bool isPair = false;         ///< whether nobody needs to be named behind the values
-    bool isWhole = false;        ///< whether long texts are not cut
-    std::size_t mostValues = 8;  ///< how many values are written; the others are counted
-    TValueWords words = {};      ///< for the values of the property
+    bool isPair = false;                 ///< whether nobody needs to be named behind the values
+    bool isWhole = false;                ///< whether long texts are not cut
+    std::size_t mostValues = 8;          ///< how many values are written; the others are counted
+    const TValueWords* words = nullptr;  ///< for the values of the property, if there are any
 };
 
 }  // namespace NORVZEL20

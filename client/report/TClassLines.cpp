@@ -257,7 +257,7 @@ std::string TClassLines::ExampleOf(const TPropertyFinding& property) const
 // Without the names of inventories if `isPair`.
 std::string TClassLines::Change(const TChangeFinding& change, bool isPair) const
 {
-    const TChangeStyle style{isPair, fOptions.hasWholeKeys, fMost, fFindings.WordsFor(change.change.property)};
+    const TChangeStyle style{isPair, fOptions.hasWholeKeys, fMost, &fFindings.WordsFor(change.change.property)};
     return ChangeText(change.change, fNames, style) + (change.sharing.empty() ? "" : kSharesKey);
 }
 

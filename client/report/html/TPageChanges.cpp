@@ -91,7 +91,7 @@ std::string TPageChanges::ShortText(const TValueDifference& change, const TValue
     }
     TChangeStyle style;
     style.isPair = true;
-    style.words = words;
+    style.words = &words;
     const std::string text = ChangeText(change, fNames, style);
     return text.size() < texts[0].size() + texts[1].size() ? text : std::string();
 }
