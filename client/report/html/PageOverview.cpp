@@ -119,9 +119,9 @@ TJson ExampleOf(const TPageFinding::TExample& example)
 
 TJson RuleOf(TRuleProposals& proposals, const std::string& className, const TPageFinding& finding)
 {
-    const TRuleProposals::TProposal rule = finding.kind == TDifference::kChanged
-                                               ? proposals.LeaveOutProperty(className, finding.property)
-                                               : proposals.LeaveOutClass(className);
+    const TRuleProposals::TProposal& rule = finding.kind == TDifference::kChanged
+                                                ? proposals.LeaveOutProperty(className, finding.property)
+                                                : proposals.LeaveOutClass(className);
     return {{"what", EscapeForDisplay(rule.what)}, {"place", EscapeForDisplay(rule.place)}, {"xml", rule.xml}};
 }
 

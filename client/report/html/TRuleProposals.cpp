@@ -70,9 +70,22 @@ TRuleProposals::TRuleProposals(const TComparisonReport& report)
     }
 }
 
-TRuleProposals::TProposal TRuleProposals::LeaveOutProperty(const std::string& className, const std::string& path)
+const TRuleProposals::TProposal& TRuleProposals::LeaveOutProperty(const std::string& className, const std::string& path)
 {
-    const std::string property = path.substr(0, path.find('.'));
+    const std::pair<std::string, std::string> key(className, path.substr(0, path.find('.')));
+    const auto known = fForProperties.find(key);
+    return known != fForProperties.end() ? known->second
+                                         : fForProperties.emplace(key, ForProperty(key.first, key.second)).first->second;
+}
+
+const TRuleProposals::TProposal& TRuleProposals::LeaveOutClass(const std::string& className)
+{
+    const auto known = fForClasses.find(className);
+    return known != fForClasses.end() ? known->second : fForClasses.emplace(className, ForClass(className)).first->second;
+}
+
+TRuleProposals::TProposal TRuleProposals::ForProperty(const std::string& className, const std::string& property)
+{
     const std::string what = "Leaves " + property + " of " + className + " out, and of the classes below it; so does --exclude " +
                              QuoteForShell(className + "." + property) + ".";
     if (!fTrace) {
@@ -101,7 +114,7 @@ TRuleProposals::TProposal TRuleProposals::LeaveOutProperty(const std::string& cl
             list};
 }
 
-TRuleProposals::TProposal TRuleProposals::LeaveOutClass(const std::string& className)
+TRuleProposals::TProposal TRuleProposals::ForClass(const std::string& className)
 {
     const std::string what =
         "Rules cannot leave out single instances; this leaves out all of " + className + ", and of the classes below it.";
