@@ -81,20 +81,8 @@ void TBaselineReview::AddChanged(const TAcceptedDifference& present, std::size_t
 
 void TBaselineReview::Count(const TDifference& difference, const std::vector<std::size_t>& left)
 {
-    switch (difference.kind) {
-    case TDifference::kOnlyInReference:
-        ++fCounts.onlyInReference;
-        break;
-    case TDifference::kOnlyInOthers:
-        ++fCounts.onlyInOthers;
-        fCounts.instancesOnlyInOthers += ReduceDifference(difference, left).CountInstances();
-        break;
-    case TDifference::kChanged:
-        ++fCounts.changedValues;
-        fCounts.changedInstances += fChanged == difference.instance ? 0 : 1;
-        fChanged = difference.instance;
-        break;
-    }
+    const bool areMany = difference.kind == TDifference::kOnlyInOthers;
+    fCounter.Add(difference.kind, difference.instance, areMany ? ReduceDifference(difference, left).CountInstances() : 1);
 }
 
 void TBaselineReview::SortOut()

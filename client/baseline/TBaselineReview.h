@@ -6,6 +6,7 @@
 #include "client/baseline/TAcceptance.h"
 #include "client/comparison/IDifferences.h"
 #include "client/comparison/TBaselineOutcome.h"
+#include "client/comparison/TDifferenceCounter.h"
 
 namespace NORVZEL20 {
 
@@ -17,7 +18,7 @@ class TBaselineReview {
     TBaselineReview(IDifferences& all, const TAcceptance& acceptance);
 
     /// The counts of what the baseline does not accept.
-    const TDifferenceCounts& GetCounts() const { return fCounts; }
+    const TDifferenceCounts& GetCounts() const { return fCounter.GetCounts(); }
     /// Without the name of the file.
     const TBaselineOutcome& GetOutcome() const { return fOutcome; }
     /// The baseline that accepts all that is there, with this reason for what is new. An entry that still holds keeps its reason
@@ -31,12 +32,11 @@ class TBaselineReview {
     void SortOut();
 
     const TAcceptance& fAcceptance;
-    TDifferenceCounts fCounts;
+    TDifferenceCounter fCounter;
     TBaselineOutcome fOutcome;
     TBaseline fUnaccepted;                        // what is there and not accepted
     std::vector<std::vector<std::string>> fKept;  // for each entry, the labels that it stays for
     std::vector<std::vector<std::string>> fReplaced;
-    std::string fChanged;  // class and instance of the changed value counted last
 };
 
 }  // namespace NORVZEL20

@@ -2,6 +2,7 @@
 
 #include <utility>
 
+#include "client/comparison/TDifferenceCounter.h"
 #include "client/comparison/TInstanceVotes.h"
 
 namespace NORVZEL20 {
@@ -15,29 +16,9 @@ TMajorityView::TMajorityView(std::shared_ptr<IDifferences> differences, const st
             fUncompared.emplace(cls.name, cls.madeIn);
         }
     }
-    Count();
-}
-
-void TMajorityView::Count()
-{
-    std::string className;
-    std::string changed;  // the instance of the last changed value
-    ForEach([&](const TDifference& difference) {
-        switch (difference.kind) {
-        case TDifference::kOnlyInReference:
-            ++fCounts.onlyInReference;
-            break;
-        case TDifference::kOnlyInOthers:
-            ++fCounts.onlyInOthers;
-            fCounts.instancesOnlyInOthers += difference.CountInstances();
-            break;
-        case TDifference::kChanged:
-            ++fCounts.changedValues;
-            fCounts.changedInstances += className == difference.className && changed == difference.instance ? 0 : 1;
-            className = difference.className;
-            changed = difference.instance;
-        }
-    });
+    TDifferenceCounter counter;
+    ForEach([&counter](const TDifference& difference) { counter.Add(difference); });
+    fCounts = counter.GetCounts();
 }
 
 void TMajorityView::ForEach(const TCallback& callback)

@@ -39,7 +39,6 @@ class TMajorityView final : public IDifferences {
     void ForEach(const TCallback& callback) override;
 
   private:
-    void Count();
     std::vector<TDifference> FromMajority(const std::vector<TDifference>& ofInstance) const;
 
     const std::shared_ptr<IDifferences> fDifferences;

@@ -37,14 +37,10 @@ TClassCollector::TClassCollector(const std::vector<TInventory>& inventories, TSh
 
 void TClassCollector::Add(const TDifference& difference)
 {
-    TDifferenceCounts& counts = fFindings.counts;
+    fCounter.Add(difference);
     if (difference.kind != TDifference::kChanged) {
-        ++(difference.kind == TDifference::kOnlyInReference ? counts.onlyInReference : counts.onlyInOthers);
         return AddPresence(difference);
     }
-    ++counts.changedValues;
-    counts.changedInstances += fInstance == difference.instance ? 0 : 1;
-    fInstance = difference.instance;
     ++fFindings.changedProperties[difference.values.front().property];
     AddChange(difference, difference.values.front());
 }
@@ -129,6 +125,7 @@ void TClassCollector::Keep(TProperty& property, const TDigest& digest, TKnown& k
 
 TClassFindings TClassCollector::Take()
 {
+    fFindings.counts = fCounter.GetCounts();
     std::stable_sort(fFindings.presences.begin(), fFindings.presences.end(),
                      [](const TPresenceFinding& one, const TPresenceFinding& other) { return one.kind < other.kind; });
     for (auto& [where, property] : fProperties) {

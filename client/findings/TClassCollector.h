@@ -8,6 +8,7 @@
 #include <vector>
 
 #include "client/comparison/TDifference.h"
+#include "client/comparison/TDifferenceCounter.h"
 #include "client/findings/TClassFindings.h"
 #include "client/findings/TPresencePlaces.h"
 #include "client/findings/TShortNames.h"
@@ -66,9 +67,9 @@ class TClassCollector {
     TShortNames& fNames;
     const std::size_t fMost;
     TClassFindings fFindings;
+    TDifferenceCounter fCounter;
     TPresencePlaces<> fPresences;  // in fFindings.presences
     std::map<TWhere, TProperty> fProperties;
-    std::string fInstance;  // of the last changed value
 };
 
 }  // namespace NORVZEL20

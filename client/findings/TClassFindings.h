@@ -14,7 +14,7 @@ namespace NORVZEL20 {
 /// What was found in the instances of one class.
 struct TClassFindings {
     std::string className;
-    TDifferenceCounts counts;                              ///< instancesOnlyInOthers is not counted
+    TDifferenceCounts counts;
     std::vector<TPresenceFinding> presences;               ///< those of the reference first; then in the order of the differences
     std::vector<TPropertyFinding> properties;              ///< ascending by name; of the same name, those with fewest changes first
     std::map<std::string, std::size_t> changedProperties;  ///< how many changed values each has; an embedded instance is one

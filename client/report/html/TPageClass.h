@@ -11,7 +11,7 @@ namespace NORVZEL20 {
 /// The differences of one class, counted for a page.
 struct TPageClass {
     std::string name;
-    TDifferenceCounts counts;              ///< instancesOnlyInOthers is not counted
+    TDifferenceCounts counts;
     std::vector<std::size_t> differences;  ///< for each inventory, in how many it takes part
     std::vector<std::size_t> instances;    ///< for each inventory, how many instances these are about
 };

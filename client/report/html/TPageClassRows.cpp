@@ -52,7 +52,6 @@ void TPageClassRows::AddInstance(const TDifference& difference)
         fHasInstance = true;
         fInstance = difference.instance;
         fCounted.assign(fInventories, false);
-        fHasChanged = false;
         fInstances.push_back({fData.texts.Add(fNames.Of(difference)), fData.texts.Add(EscapeForDisplay(difference.GetKeyText()))});
     }
     TInstance& instance = fInstances.back();
@@ -71,19 +70,7 @@ void TPageClassRows::AddInstance(const TDifference& difference)
 
 void TPageClassRows::Count(const TDifference& difference)
 {
-    TDifferenceCounts& counts = fClass.counts;
-    switch (difference.kind) {
-    case TDifference::kOnlyInReference:
-        ++counts.onlyInReference;
-        break;
-    case TDifference::kOnlyInOthers:
-        ++counts.onlyInOthers;
-        break;
-    default:
-        ++counts.changedValues;
-        counts.changedInstances += fHasChanged ? 0 : 1;
-        fHasChanged = true;
-    }
+    fCounter.Add(difference);
     for (const std::size_t inventory : difference.inventories) {
         ++fClass.differences[inventory];
         fClass.instances[inventory] += fCounted[inventory] ? 0 : 1;
@@ -190,6 +177,7 @@ void TPageClassRows::Write()
     for (auto& property : fProperties) {
         WriteFinding(property.second, firstInstance);
     }
+    fClass.counts = fCounter.GetCounts();
     fData.classes.push_back(std::move(fClass));
 }
 

@@ -10,6 +10,7 @@
 
 #include "client/comparison/TComparisonReport.h"
 #include "client/comparison/TDifference.h"
+#include "client/comparison/TDifferenceCounter.h"
 #include "client/findings/TPresencePlaces.h"
 #include "client/findings/TShortNames.h"
 #include "client/report/html/TPageChanges.h"
@@ -82,6 +83,7 @@ class TPageClassRows {
     TPageData& fData;
     TPageChanges fChanges;
     TPageClass fClass;
+    TDifferenceCounter fCounter;
     const std::vector<TInventory>& fReportInventories;
     const std::size_t fInventories;
     std::map<std::string, TValueWords> fWords;  // by property
@@ -92,7 +94,6 @@ class TPageClassRows {
     std::string fInstance;       // the key of the last one
     std::vector<bool> fCounted;  // the inventories that are counted for it
     bool fHasInstance = false;
-    bool fHasChanged = false;  // whether the last instance has a changed value
 };
 
 }  // namespace NORVZEL20
