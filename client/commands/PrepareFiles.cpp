@@ -1,5 +1,7 @@
 #include "client/commands/PrepareFiles.h"
 
+#include <utility>
+
 #include "client/commands/SaveRules.h"
 #include "client/files/TInputFile.h"
 #include "client/inventory/CheckInventoryFiles.h"
@@ -12,6 +14,22 @@
 namespace NORVZEL20 {
 
 namespace {
+
+// One result must not replace another.
+void CheckOutputsDiffer(const TCommandFiles& files)
+{
+    const std::pair<const char*, const std::string*> outputs[] = {
+        {"--output", &files.output}, {"--accept", &files.accept}, {"--save-rules", &files.savedRules}};
+    for (const auto& [option, path] : outputs) {
+        for (const auto* other = outputs; other->second != path; ++other) {
+            const bool areWritten = !path->empty() && (!other->second->empty() || other->second == &files.output);
+            if (areWritten && AreSameTarget(*path, *other->second)) {
+                throw TClientError(*path + ": found for both " + option + " and " + other->first +
+                                   ", expected two files; name another one");
+            }
+        }
+    }
+}
 
 // Checks the files of accepted differences and adds them to the inputs.
 void CheckBaselineFiles(const TCommandFiles& files, std::vector<std::string>& inputs)
@@ -29,10 +47,6 @@ void CheckBaselineFiles(const TCommandFiles& files, std::vector<std::string>& in
         return;
     }
     CheckOutput(files.accept, inputs);
-    if (files.accept == files.output) {
-        throw TClientError(files.accept + ": found for both the result and the accepted differences, expected two files; "
-                                          "name another one for the result");
-    }
     inputs.push_back(files.accept);
 }
 
@@ -53,9 +67,10 @@ std::vector<TInventorySources> PrepareFiles(const TCommandFiles& files, TLoading
     if (!files.rules.empty()) {
         inputs.push_back(files.rules);
     }
+    CheckOutputsDiffer(files);
     CheckBaselineFiles(files, inputs);
     CheckOutput(files.output, inputs);
-    CheckSavedRules(files.savedRules, inputs, {files.output, files.accept});
+    CheckSavedRules(files.savedRules, inputs);
     loading.output = IsStandardOutput(files.output) ? std::string() : files.output;
     CheckInventoryFiles(toLoad);
     inventories = DropRepeatedInventories(std::move(inventories), fewest, console);

@@ -1,7 +1,5 @@
 #include "client/commands/SaveRules.h"
 
-#include <algorithm>
-
 #include "client/process/TClientError.h"
 #include "client/report/TResultOutput.h"
 #include "client/rules/DescribeSelection.h"
@@ -9,16 +7,13 @@
 
 namespace NORVZEL20 {
 
-void CheckSavedRules(const std::string& path, const std::vector<std::string>& inputs, const std::vector<std::string>& written)
+void CheckSavedRules(const std::string& path, const std::vector<std::string>& inputs)
 {
     if (path.empty()) {
         return;
     }
     if (IsStandardOutput(path)) {
         throw TClientError("--save-rules writes a file, since the result goes to standard output; name a file");
-    }
-    if (std::count(written.begin(), written.end(), path) > 0) {
-        throw TClientError("--save-rules names a file that is written for another option too, " + path + "; name two");
     }
     CheckOutput(path, inputs);
 }

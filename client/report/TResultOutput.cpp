@@ -92,6 +92,15 @@ bool IsSpecial(const std::string& path)
     return stat(path.c_str(), &status) == 0 && !S_ISREG(status.st_mode);
 }
 
+// Where the entry of a file stands: its folder, by whatever path, and its name there.
+bool AreSameEntry(const std::string& a, const std::string& b)
+{
+    const auto folder = [](const std::string& path) { return IdentifyFile(FolderOf(path).empty() ? "." : FolderOf(path)); };
+    const std::optional<TFileIdentity> first = folder(a);
+    const std::optional<TFileIdentity> second = folder(b);
+    return first && second && *first == *second && a.substr(FolderOf(a).size()) == b.substr(FolderOf(b).size());
+}
+
 // Gives the file the owner and the rights of the one that it replaces. If there is none, gives it the rights that any new file
 // would have: a temporary file has fewer.
 void SetRights(int descriptor, const std::string& target)
@@ -181,11 +190,35 @@ void CheckNotRead(const std::string& path, const std::vector<std::string>& input
     throw TClientError(path + ": cannot be written", error.code());
 }
 
+TTarget FindTarget(const std::string& path)
+{
+    try {
+        return FollowLinks(IsStandardOutput(path) ? "/dev/stdout" : path);
+    } catch (const std::system_error& error) {
+        RefuseToWrite(path, error);
+    }
+}
+
 }  // namespace
 
 bool IsStandardOutput(const std::string& path)
 {
     return path.empty() || path == "-";
+}
+
+bool AreSameTarget(const std::string& a, const std::string& b)
+{
+    const TTarget first = FindTarget(a);
+    const TTarget second = FindTarget(b);
+    if ((first.descriptor && second.descriptor) || IsSpecial(first.path) || IsSpecial(second.path)) {
+        return false;
+    }
+    if (!first.descriptor && !second.descriptor) {
+        return AreSameEntry(first.path, second.path);
+    }
+    const std::optional<TFileIdentity> one = IdentifyFile(first.path);
+    const std::optional<TFileIdentity> other = IdentifyFile(second.path);
+    return one && other && *one == *other;
 }
 
 void CheckOutput(const std::string& path, const std::vector<std::string>& inputs)

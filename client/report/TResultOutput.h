@@ -15,6 +15,11 @@ namespace NORVZEL20 {
 /// Whether a result for that path goes to standard output: the path is empty or "-".
 bool IsStandardOutput(const std::string& path);
 
+/// Whether one of two results would replace the other, because both paths lead to one ordinary file, whether or not it is there.
+/// A path of standard output stands for the file to which that goes. Devices, pipes and two open descriptors take any number of
+/// results. Errors: TClientError if links lead nowhere.
+bool AreSameTarget(const std::string& a, const std::string& b);
+
 /// Checks, without changing anything, whether a result can be delivered to that path and would not replace one of the `inputs`,
 /// which are paths too, with "-" for standard input. A device may still turn out to be full.
 /// Errors: TClientError.

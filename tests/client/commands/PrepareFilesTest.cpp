@@ -118,6 +118,41 @@ TEST_F(PrepareFilesTest, AFileThatIsReadIsNotReplaced)
     EXPECT_EQ("", Result({"show", inventory, "--output", "/dev/null"}));
 }
 
+TEST_F(PrepareFilesTest, AResultDoesNotReplaceAnother)
+{
+    ASSERT_EQ(0, symlink("x.txt", (fFolder / "link").c_str()));
+    ASSERT_EQ(0, symlink(".", (fFolder / "folder").c_str()));
+    const struct {
+        const char* first;
+        const char* second;
+        const char* message;
+    } rows[] = {
+        {"--accept F/x.txt", "--output F/x.txt", "F/x.txt: found for both --accept and --output"},
+        {"--accept F/./x.txt", "--output F/x.txt", "F/./x.txt: found for both --accept and --output"},
+        {"--accept F/link", "--output F/x.txt", "F/link: found for both --accept and --output"},
+        {"--accept F/x.txt", "--output F/folder/link", "F/x.txt: found for both --accept and --output"},
+        {"--save-rules F/./x.txt", "--output F/x.txt", "F/./x.txt: found for both --save-rules and --output"},
+        {"--save-rules F/link", "--output F/x.txt", "F/link: found for both --save-rules and --output"},
+        {"--accept F/x.txt", "--save-rules F//x.txt", "F//x.txt: found for both --save-rules and --accept"},
+        {"--accept F/x.txt", "--save-rules F/folder/x.txt", "F/folder/x.txt: found for both --save-rules and --accept"},
+        {"--accept F/x.txt", "> F/x.txt", "F/x.txt: found for both --accept and --output"},
+        {"--baseline F/base.txt", "--output F/./base.txt", "F/./base.txt: is one of the files that are read"},
+        {"--baseline F/base.txt", "--save-rules F/folder/base.txt", "F/folder/base.txt: is one of the files that are read"},
+        // Nothing is replaced here.
+        {"--accept F/x.txt", "--output F/y.txt", "F/slow.xml:1:1: "},
+        {"--accept F/x.txt", "--output F/none/../x.txt", "F/none/../x.txt: cannot be written"},
+        {"--save-rules /dev/null", "--output /dev/null", "F/slow.xml:1:1: "},
+    };
+    for (const auto& row : rows) {
+        std::ofstream(fFolder / "base.txt") << "";
+        const std::string command = "compare web01.xml F/slow.xml " + std::string(row.first) + " " + row.second;
+        const std::string said = Shorten(Shell(Shorten(command, "F/", fFolder / "")), fFolder / "", "F/");
+        EXPECT_EQ(0u, said.find(std::string("[2]\n--\ncimdelta: ") + row.message)) << command << "\n" << said;
+        std::filesystem::remove(fFolder / "x.txt");
+    }
+    EXPECT_EQ("base.txt folder link slow.xml ", fFolder.List());
+}
+
 TEST_F(PrepareFilesTest, ARepeatedInventoryIsDroppedWithANote)
 {
     const std::string a = Copy("a.xml");
