@@ -77,7 +77,8 @@ TTextOptions TextOptions(const TCompareOptions& options, const IConsole& console
     return text;
 }
 
-// What is accepted is kept before the report is seen: if that fails, there is no report.
+// What is saved is kept before the report is seen, and after it could be made: if either fails, the report is not seen, and if the
+// report cannot be made, nothing is kept.
 void Deliver(TComparisonReport& report, const TCompareOptions& options, const TBaseline* accepted, IConsole& console)
 {
     TResultOutput output(console, options.output);
@@ -88,6 +89,7 @@ void Deliver(TComparisonReport& report, const TCompareOptions& options, const TB
         WriteReport(report, options.format, TextOptions(options, console),
                     [&output](std::string_view piece) { output.Write(piece); });
     }
+    SaveRules(options.savedRules, report, options.selection, console);
     if (accepted != nullptr) {
         DeliverResult(console, options.baseline.accept, accepted->ToText());
     }
@@ -127,7 +129,6 @@ int RunCompare(const TCompareOptions& options, IConsole& console)
     if (!options.allowEmpty && report.coverage.IsNothingCompared()) {
         throw TClientError(DescribeNothingCompared(report, inventories, options.rules, options.strictSchema));
     }
-    SaveRules(options.savedRules, report, options.selection, console);
     if (reference.WantsMajority()) {
         report = SeeFromMajority(report);
     }

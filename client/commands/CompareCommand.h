@@ -44,8 +44,9 @@ struct TCompareOptions {
 };
 
 /// Compares inventories. Returns kExitSuccess (0) for no differences, or for none that are not accepted, otherwise kExitDifferences
-/// (1). Errors: TClientError, also if nothing was compared, unless that is allowed; no result has been written then, and the file
-/// of accepted differences is as it was.
+/// (1). Rules and accepted differences are written once the report is made, in this order, and then the report is delivered.
+/// Errors: TClientError, also if nothing was compared, unless that is allowed. What comes later in that order is as it was then; a
+/// device or a pipe may have part of the report.
 int RunCompare(const TCompareOptions& options, IConsole& console);
 
 }  // namespace NORVZEL20

@@ -79,6 +79,15 @@ TEST_F(InterruptedOutputTest, NoRoomLeavesWhatWasThere)
     EXPECT_EQ("report ", fFolder.List());
 }
 
+TEST_F(InterruptedOutputTest, NothingIsSavedIfTheReportCannotBeMade)
+{
+    EXPECT_EQ("[2]\n--\ncimdelta: " + fReport + ": cannot be written: File too large\n",
+              Shell("compare " CIMDELTA_PAIR_DATA "/a.xml.xz " CIMDELTA_PAIR_DATA "/b.xml.xz -o json --output " + fReport +
+                        " --accept " + (fFolder / "accepted") + " --save-rules " + (fFolder / "rules"),
+                    "ulimit -f 8000; "));
+    EXPECT_EQ("report ", fFolder.List());
+}
+
 TEST_F(InterruptedOutputTest, AWriterThatIsKilledLeavesWhatWasThere)
 {
     EXPECT_EQ("signal 9", EndInTheMiddle(WriteReport(), SIGKILL));
