@@ -1,6 +1,7 @@
 #pragma once
 
 #include <string>
+#include <vector>
 
 namespace NORVZEL20 {
 
@@ -26,6 +27,22 @@ inline std::string KeyProperty(const std::string& name)
 inline std::string Value(const std::string& name, const std::string& value, const std::string& type = "string")
 {
     return "<PROPERTY NAME=\"" + name + "\" TYPE=\"" + type + "\"><VALUE>" + value + "</VALUE></PROPERTY>";
+}
+
+inline std::string ListDeclaration(const std::string& name, const std::string& type = "string",
+                                   const std::string& qualifiers = std::string())
+{
+    return "<PROPERTY.ARRAY NAME=\"" + name + "\" TYPE=\"" + type + "\">" + qualifiers + "</PROPERTY.ARRAY>";
+}
+
+inline std::string List(const std::string& name, const std::vector<std::string>& values, const std::string& type = "string")
+{
+    std::string elements;
+    for (const std::string& value : values) {
+        elements += "<VALUE>" + value + "</VALUE>";
+    }
+    return "<PROPERTY.ARRAY NAME=\"" + name + "\" TYPE=\"" + type + "\"><VALUE.ARRAY>" + elements +
+           "</VALUE.ARRAY></PROPERTY.ARRAY>";
 }
 
 inline std::string Class(const std::string& name, const std::string& super, const std::string& properties)

@@ -10,20 +10,6 @@
 namespace NORVZEL20 {
 namespace {
 
-std::string List(const std::string& name, const std::vector<std::string>& values)
-{
-    std::string elements;
-    for (const std::string& value : values) {
-        elements += "<VALUE>" + value + "</VALUE>";
-    }
-    return "<PROPERTY.ARRAY NAME=\"" + name + "\" TYPE=\"string\"><VALUE.ARRAY>" + elements + "</VALUE.ARRAY></PROPERTY.ARRAY>";
-}
-
-std::string ListDeclaration(const std::string& name)
-{
-    return "<PROPERTY.ARRAY NAME=\"" + name + "\" TYPE=\"string\"/>";
-}
-
 /// What a made system holds, property by property, so that a test can plant a difference.
 class TMadeSystem {
   public:

@@ -1,20 +1,7 @@
-#include <gtest/gtest.h>
-#include <sys/stat.h>
-
-#include "tests/client/Documents.h"
-#include "tests/client/TClientFixture.h"
+#include "tests/client/report/TGroupedFixture.h"
 
 namespace NORVZEL20 {
 namespace {
-
-std::string Texts(const std::string& name, const std::vector<std::string>& values)
-{
-    std::string elements;
-    for (const std::string& value : values) {
-        elements += "<VALUE>" + value + "</VALUE>";
-    }
-    return "<PROPERTY.ARRAY NAME=\"" + name + "\" TYPE=\"string\"><VALUE.ARRAY>" + elements + "</VALUE.ARRAY></PROPERTY.ARRAY>";
-}
 
 std::string Package(const std::string& name, const std::string& version, const std::string& vendor = "Debian")
 {
@@ -38,12 +25,12 @@ std::string Service(const std::string& name, const std::string& started)
 
 std::string User(const std::string& name, const std::string& uid, const std::vector<std::string>& groups)
 {
-    return Instance("User", Value("Name", name) + Value("UID", uid, "uint32") + Texts("Groups", groups));
+    return Instance("User", Value("Name", name) + Value("UID", uid, "uint32") + List("Groups", groups));
 }
 
 std::string Mount(const std::string& name, const std::vector<std::string>& options)
 {
-    return Instance("Mount", Value("Name", name) + Texts("Options", options));
+    return Instance("Mount", Value("Name", name) + List("Options", options));
 }
 
 std::string Adapter(const std::string& name, const std::string& mtu)
@@ -61,55 +48,10 @@ std::string Schema()
            Class("Adapter", "", KeyProperty("Name") + Declaration("MTU", "uint32"));
 }
 
-/// Compares made systems as a person does, in a folder of its own, and reads the report.
-class GroupedReportTest : public TClientFixture {
+/// Systems with the classes of Schema().
+class GroupedReportTest : public TGroupedFixture {
   protected:
-    void SetUp() override
-    {
-        fFolder = ::testing::TempDir() + "cimdelta-grouped-" + std::to_string(getpid());
-        ASSERT_EQ(0, mkdir(fFolder.c_str(), 0700));
-        ASSERT_EQ(0, chdir(fFolder.c_str()));
-    }
-
-    void TearDown() override
-    {
-        for (const std::string& name : fFiles) {
-            unlink(name.c_str());
-        }
-        rmdir(fFolder.c_str());
-    }
-
-    void System(const std::string& name, const std::string& contents)
-    {
-        Write(name + ".xml", Document(NORVZEL20::System() + Schema() + contents));
-        fSystems.push_back(name + ".xml");
-    }
-
-    void Write(const std::string& name, const std::string& text)
-    {
-        std::ofstream(name) << text;
-        fFiles.push_back(name);
-    }
-
-    std::string Compare(const std::vector<std::string>& options = {})
-    {
-        std::vector<std::string> arguments{"compare"};
-        arguments.insert(arguments.end(), fSystems.begin(), fSystems.end());
-        arguments.insert(arguments.end(), options.begin(), options.end());
-        return Result(arguments);
-    }
-
-    /// What stands between the summary and the coverage.
-    std::string Findings(const std::vector<std::string>& options = {})
-    {
-        const std::string report = Compare(options);
-        const std::size_t begin = report.find("\n\n") + 2;
-        return report.substr(begin, report.rfind("\n\n") + 1 - begin);
-    }
-
-    std::string fFolder;
-    std::vector<std::string> fSystems;
-    std::vector<std::string> fFiles;
+    void System(const std::string& name, const std::string& contents) { TGroupedFixture::System(name, Schema() + contents); }
 };
 
 TEST_F(GroupedReportTest, OfTwoSystemsSaysWhatChangedWhere)
@@ -324,240 +266,6 @@ TEST_F(GroupedReportTest, CoverageShowsAllOfIt)
               "Compared: 2 classes; 2 instances of a, 2 instances of b.\n"
               "4 classes have no instances in any inventory.\n",
               Compare({"--coverage"}));
-}
-
-/// A class of plain texts, and its instances.
-std::string PlainClass(const std::string& name, const std::vector<std::string>& properties)
-{
-    std::string declarations = KeyProperty("Name");
-    for (const std::string& property : properties) {
-        declarations += Declaration(property, "string");
-    }
-    return Class(name, "", declarations);
-}
-
-std::string Plain(const std::string& cls, const std::string& name, const std::string& property = std::string(),
-                  const std::string& value = std::string())
-{
-    return Instance(cls, Value("Name", name) + (property.empty() ? "" : Value(property, value)));
-}
-
-std::string ListOf(const std::string& property)
-{
-    return "<PROPERTY.ARRAY NAME=\"" + property + "\" TYPE=\"string\"/>";
-}
-
-/// Two web servers, one of which was broken into.
-class BreakInTest : public GroupedReportTest {
-  protected:
-    static std::string Server(const std::string& forwards, const std::string& logs, const std::string& more)
-    {
-        std::string text = PlainClass("KALMO_KernelParameter", {"Value"}) + PlainClass("KALMO_Package", {"Version", "Vendor"}) +
-                           Class("KALMO_Service", "", KeyProperty("Name") + Declaration("Started", "boolean")) +
-                           Class("KALMO_User", "", KeyProperty("Name") + Declaration("UID", "uint32") + ListOf("Groups")) +
-                           PlainClass("KALMO_NetworkAdapter", {"MTU"}) + PlainClass("KALMO_FileSystem", {"Type"}) +
-                           PlainClass("KALMO_Processor", {"Family"}) +
-                           PlainClass("KALMO_KernelModule", {"P1", "P2", "P3", "P4", "P5", "P6", "P7", "P8", "P9"});
-        text += Plain("KALMO_KernelParameter", "net.ipv4.ip_forward", "Value", forwards) +
-                Plain("KALMO_KernelParameter", "net.ipv4.tcp_sack", "Value", "1") +
-                Instance("KALMO_Service", Value("Name", "rsyslog") + Value("Started", logs, "boolean")) +
-                Instance("KALMO_Service", Value("Name", "ssh") + Value("Started", "TRUE", "boolean")) +
-                Instance("KALMO_User", Value("Name", "root") + Value("UID", "0", "uint32") + Texts("Groups", {"root"})) +
-                Plain("KALMO_NetworkAdapter", "eth0", "MTU", "1500") + Plain("KALMO_FileSystem", "/", "Type", "ext4") +
-                Plain("KALMO_Processor", "0", "Family", "x86") + Plain("KALMO_KernelModule", "xfs", "P1", logs);
-        for (int i = 1; i <= 320; ++i) {
-            text += Instance("KALMO_Package",
-                             Value("Name", "p" + std::to_string(i)) + Value("Version", "1") + Value("Vendor", "Debian"));
-        }
-        return Document(NORVZEL20::System() + text + more);
-    }
-
-    void Inventory(const std::string& name, const std::string& text)
-    {
-        Write(name + ".xml", text);
-        fSystems.push_back(name + ".xml");
-    }
-};
-
-TEST_F(BreakInTest, IsReadInFourLines)
-{
-    Inventory("web01", Server("0", "TRUE", ""));
-    Inventory("web07", Server("1", "FALSE",
-                              Instance("KALMO_Package",
-                                       Value("Name", "cryptominer") + Value("Version", "1.0-1") + Value("Vendor", "unknown")) +
-                                  Instance("KALMO_User", Value("Name", "mallory") + Value("UID", "1004", "uint32") +
-                                                             Texts("Groups", {"mallory", "sudo"}))));
-    std::string rules;
-    for (const char* const cls :
-         {"KernelParameter", "Package", "Service", "User", "NetworkAdapter", "FileSystem", "Processor", "OperatingSystem"}) {
-        rules += std::string("<class name='KALMO_") + cls + "' default='include'/>";
-    }
-    rules += "<class name='KALMO_KernelModule' default='include'><excludelist>";
-    for (int i = 1; i <= 9; ++i) {
-        rules += "<value>P" + std::to_string(i) + "</value>";
-    }
-    Write("r2.xml", "<DifftoolSpec>" + rules + "</excludelist></class></DifftoolSpec>");
-    EXPECT_EQ("web01 -> web07: 4 differences (+2 instances, 2 values) in 4 of 9 classes\n"
-              "\n"
-              "KALMO_KernelParameter  ~ net.ipv4.ip_forward.Value: 0 -> 1\n"
-              "KALMO_Package          + cryptominer   Version 1.0-1, Vendor unknown\n"
-              "KALMO_Service          ~ rsyslog.Started: TRUE -> FALSE\n"
-              "KALMO_User             + mallory       UID 1004, Groups {mallory, sudo}\n"
-              "\n"
-              "330 and 332 instances in 9 classes compared; 9 properties left out by r2.xml (--coverage)\n",
-              Compare({"--spec", "r2.xml"}));
-}
-
-/// Eight web servers that drifted apart.
-class EightServersTest : public BreakInTest {
-  protected:
-    struct TServer {
-        std::string mtu = "1500";
-        std::vector<std::string> mount = {"rw", "noexec"};
-        bool isUpgraded = false;
-        bool lacksTwo = false;
-        std::string extra = std::string();
-        std::vector<std::string> services = {"1", "1", "1", "1"};
-        std::string shell = "sh";
-    };
-
-    void Add(const std::string& name, const TServer& server)
-    {
-        std::string text = Class("KALMO_NetworkAdapter", "", KeyProperty("Name") + Declaration("MTU", "uint32")) +
-                           Class("KALMO_FileSystem", "", KeyProperty("Name") + ListOf("MountOptions")) +
-                           PlainClass("KALMO_Package", {"Version"}) + PlainClass("KALMO_Service", {"Mode"}) +
-                           PlainClass("KALMO_User", {"Shell"});
-        for (int i = 0; i < 4; ++i) {
-            text += Instance("KALMO_NetworkAdapter", Value("Name", "eth" + std::to_string(i)) + Value("MTU", server.mtu, "uint32"));
-        }
-        text += Instance("KALMO_FileSystem", Value("Name", "/srv") + Texts("MountOptions", server.mount)) +
-                Plain("KALMO_FileSystem", "/");
-        text += Plain("KALMO_Package", "curl", "Version", server.isUpgraded ? "7.88.1-10+deb12u5" : "7.88.1-10");
-        for (int i = 1; i <= 42; ++i) {
-            const std::string number = std::to_string(i);
-            text += Plain("KALMO_Package", "p" + number, "Version", number + (server.isUpgraded ? "-2" : "-1"));
-        }
-        for (const std::string& package : {std::string("font11"), std::string("libdev5")}) {
-            text += server.lacksTwo ? std::string() : Plain("KALMO_Package", package, "Version", "1");
-        }
-        text += server.extra.empty() ? std::string() : Plain("KALMO_Package", server.extra, "Version", "1");
-        for (std::size_t i = 0; i < server.services.size(); ++i) {
-            text += Plain("KALMO_Service", "s" + std::to_string(i), "Mode", server.services[i]);
-        }
-        Inventory(name, Document(NORVZEL20::System() + text + Plain("KALMO_User", "www", "Shell", server.shell)));
-    }
-};
-
-TEST_F(EightServersTest, AreReadFromTheOddestOn)
-{
-    TServer upgraded;
-    upgraded.isUpgraded = true;
-    upgraded.shell = "zsh";
-    TServer oldest = upgraded;
-    oldest.lacksTwo = true;
-    TServer mined;
-    mined.extra = "cryptominer";
-    mined.services = {"2", "3", "4", "1"};
-    TServer twelve;
-    twelve.services.back() = "5";
-    TServer jumbo;
-    jumbo.mtu = "9000";
-    TServer open;
-    open.mount = {"rw"};
-    Add("web01", {});
-    Add("web07", mined);
-    Add("web12", twelve);
-    Add("web19", jumbo);
-    Add("web21", upgraded);
-    Add("web22", upgraded);
-    Add("web23", oldest);
-    Add("web31", open);
-    EXPECT_EQ("web01 against 7 others: 56 differences; all 7 differ\n"
-              "   46  web23        44  web21, web22        4  web07, web19        1  web12, web31\n"
-              "\n"
-              "KALMO_FileSystem      ~1   /srv.MountOptions: -noexec (web31)\n"
-              "KALMO_NetworkAdapter  ~4   MTU: 1500 -> 9000 (web19): eth0, eth1, eth2, eth3\n"
-              "KALMO_Package  -2 +1 ~43   missing in web23: font11, libdev5;  only in web07: cryptominer\n"
-              "    Version in 43 instances (web21..23), 43 distinct changes\n"
-              "      curl: 7.88.1-10 -> 7.88.1-10+deb12u5   ... 42 more (--property Version)\n",
-              Compare().substr(0, Compare().find("KALMO_Service")));
-    EXPECT_EQ("KALMO_Service         ~4   s3.Mode: 1 -> 5 (web12)\n"
-              "    s0.Mode: 1 -> 2 (web07)\n"
-              "    s1.Mode: 1 -> 3 (web07)\n"
-              "    s2.Mode: 1 -> 4 (web07)\n"
-              "KALMO_User            ~1   www.Shell: sh -> zsh (web21..23)\n",
-              Findings().substr(Findings().find("KALMO_Service")));
-}
-
-/// Values whose declaration says what they mean.
-class MeaningTest : public BreakInTest {
-  protected:
-    static std::string QualifierOf(const std::string& name, const std::string& text)
-    {
-        return "<QUALIFIER NAME=\"" + name + "\" TYPE=\"string\"><VALUE>" + text + "</VALUE></QUALIFIER>";
-    }
-
-    static std::string Lists(const std::string& name, const std::vector<std::string>& texts)
-    {
-        std::string values;
-        for (const std::string& text : texts) {
-            values += "<VALUE>" + text + "</VALUE>";
-        }
-        return "<QUALIFIER NAME=\"" + name + "\" TYPE=\"string\"><VALUE.ARRAY>" + values + "</VALUE.ARRAY></QUALIFIER>";
-    }
-
-    void Disk(const std::string& name, const std::string& values)
-    {
-        const std::string health =
-            Lists("ValueMap", {"2", "3", "5..10", ".."}) + Lists("Values", {"OK", "Degraded", "Lost, all", "Other"});
-        const std::string schema =
-            "<QUALIFIER.DECLARATION NAME=\"ValueMap\" TYPE=\"string\" ISARRAY=\"true\"/>"
-            "<QUALIFIER.DECLARATION NAME=\"Values\" TYPE=\"string\" ISARRAY=\"true\"/>"
-            "<QUALIFIER.DECLARATION NAME=\"PUnit\" TYPE=\"string\"/><QUALIFIER.DECLARATION NAME=\"Units\" TYPE=\"string\"/>" +
-            Class("Disk", "",
-                  KeyProperty("Name") + Declaration("Health", "uint16", health) +
-                      Declaration("Size", "uint64", QualifierOf("PUnit", "byte * 2^10")) +
-                      Declaration("Clock", "uint32", QualifierOf("Units", "MegaHertz")) + Declaration("Installed", "datetime") +
-                      Declaration("Uptime", "datetime") + "<PROPERTY.ARRAY NAME=\"States\" TYPE=\"uint16\">" + health +
-                      "</PROPERTY.ARRAY>");
-        Inventory(name, Document(NORVZEL20::System() + schema + values));
-    }
-
-    static std::string States(const std::vector<std::string>& values)
-    {
-        std::string elements;
-        for (const std::string& value : values) {
-            elements += "<VALUE>" + value + "</VALUE>";
-        }
-        return "<PROPERTY.ARRAY NAME=\"States\" TYPE=\"uint16\"><VALUE.ARRAY>" + elements + "</VALUE.ARRAY></PROPERTY.ARRAY>";
-    }
-};
-
-TEST_F(MeaningTest, IsWrittenBesideTheNumber)
-{
-    const std::string same = Instance("Disk", Value("Name", "sdz"));
-    Disk("a",
-         same + Instance("Disk", Value("Name", "sda") + Value("Health", "2", "uint16") + Value("Size", "524288", "uint64") +
-                                     Value("Clock", "100", "uint32") + Value("Installed", "20240131100000.000000+060", "datetime") +
-                                     Value("Uptime", "00000003040506.000000:000", "datetime") + States({"2"})));
-    Disk("b",
-         same +
-             Instance("Disk", Value("Name", "sda") + Value("Health", "7", "uint16") + Value("Size", "524289", "uint64") +
-                                  Value("Clock", "200", "uint32") + Value("Installed", "20240131100000.000000+000", "datetime") +
-                                  Value("Uptime", "00000003040507.000000:000", "datetime") + States({"2", "3"})) +
-             Instance("Disk", Value("Name", "sdb") + Value("Health", "99", "uint16") + Value("Size", "1048576", "uint64")));
-    EXPECT_EQ("Disk  + sdb   Health 99 Other, Size 1 GiB\n"
-              "      ~ sda.Clock: 100 MHz -> 200 MHz\n"
-              "      ~ sda.Health: 2 OK -> 7 \"Lost, all\"\n"
-              "      ~ sda.Installed: 2024-01-31 10:00:00 +01:00 -> 2024-01-31 10:00:00 +00:00\n"
-              "      ~ sda.Size: 512 MiB -> 512 MiB (536871936 bytes)\n"
-              "      ~ sda.States: {2 OK} -> {2 OK, 3 Degraded}\n"
-              "      ~ sda.Uptime: 3 d 04:05:06 -> 3 d 04:05:07\n",
-              Findings());
-    EXPECT_NE(std::string::npos, Compare({"-o", "markdown"})
-                                     .find("- `+ sdb   Health 99 Other, Size 1 GiB`\n"
-                                           "- `~ sda.Clock: 100 MHz -> 200 MHz`\n"
-                                           "- `~ sda.Health: 2 OK -> 7 \"Lost, all\"`\n"));
 }
 
 TEST_F(GroupedReportTest, FullShowsKeysAndValuesWhole)
