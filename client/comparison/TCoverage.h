@@ -1,6 +1,7 @@
 #pragma once
 
 #include <cstddef>
+#include <map>
 #include <optional>
 #include <string>
 #include <vector>
@@ -9,6 +10,7 @@
 #include "client/inventory/NotCollected.h"
 #include "client/inventory/TInventory.h"
 #include "client/inventory/TSchemaNote.h"
+#include "embedded/value/TNameText.h"
 
 namespace NORVZEL20 {
 
@@ -79,8 +81,9 @@ struct TCoverage {
         TOwnName name;
     };
 
-    std::vector<TClass> classes;        ///< in ascending order of their names
-    std::size_t classesWithout = 0;     ///< classes without an instance in any inventory
+    std::vector<TClass> classes;                                        ///< in ascending order of their names
+    std::map<std::string, std::string, TNameText::TLess> superClasses;  ///< of those classes and of each one that is named here
+    std::size_t classesWithout = 0;                                     ///< classes without an instance in any inventory
     std::vector<TSchemaNote> notes;     ///< what was done to make the inventories comparable, in that order
     std::vector<TBadValues> badValues;  ///< by inventory, then in the order of the files
     std::vector<TLack> lacks;           ///< by inventory, then in the order of its instances

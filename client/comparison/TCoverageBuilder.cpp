@@ -75,6 +75,26 @@ void TCoverageBuilder::AddClass(TCoverage& coverage, const std::string& classNam
         CountCompared(cls);
     }
     coverage.classes.push_back(cls);
+    AddSuperClasses(coverage, className);
+}
+
+// A class has the superclass that the first inventory with the class declares. The tree has no circle: that inventory declares the
+// classes above as well, so the walk never comes back to a later inventory.
+void TCoverageBuilder::AddSuperClasses(TCoverage& coverage, const std::string& className) const
+{
+    std::string name = className;
+    while (coverage.superClasses.count(name) == 0) {
+        boost::shared_ptr<TInMemClass> declared;
+        for (std::size_t i = 0; i < fInventories.size() && !declared; ++i) {
+            declared = fInventories[i].ns->FindClass(name);
+        }
+        const boost::shared_ptr<TInMemClass>& super = declared->GetSuperInMemClass();
+        if (!super) {
+            return;
+        }
+        coverage.superClasses[name] = super->GetName();
+        name = super->GetName();
+    }
 }
 
 TCoverage::EState TCoverageBuilder::Describe(TCoverage::TClass& cls)

@@ -25,6 +25,7 @@ class TCoverageBuilder {
 
   private:
     void AddClass(TCoverage& coverage, const std::string& className);
+    void AddSuperClasses(TCoverage& coverage, const std::string& className) const;
     TCoverage::EState Describe(TCoverage::TClass& cls);
     TCoverage::EState WhyNothingIsCompared(const TCoverage::TClass& cls, const TInMemClass& declared) const;
     void CountCompared(TCoverage::TClass& cls) const;

@@ -33,7 +33,7 @@ void TTextFormat::Write(const TTextSink& sink) const
     sink(Paint(fOptions.isColored, kBold, AddNotShown(Summary(), fReport)) + "\n");
     WriteDifferences(sink);
     sink(WriteBaselineText(fReport, fOptions));
-    sink("\n" + WriteTextCoverage(fReport));
+    sink("\n" + WriteDetailedCoverage(fReport));
 }
 
 std::string TTextFormat::Summary() const

@@ -16,18 +16,17 @@
 //   Made in web02: an instance of KALMO_OperatingSystem.
 //   Hint: 0 of 350 instances of Disk match; SystemName has one value in each inventory: try --self SystemName.
 //
-// Numbers with slashes between them are those of the inventories, the reference first.
+// Numbers with slashes between them are those of the inventories, the reference first. The lines from "Not compared" to
+// "References of" are those of ClassCoverage.cpp.
 #include "client/report/TextCoverage.h"
 
-#include <algorithm>
 #include <boost/algorithm/string/join.hpp>
 #include <map>
 #include <utility>
 
+#include "client/report/ClassCoverage.h"
 #include "client/report/DescribeLack.h"
 #include "client/report/DescribeNameHint.h"
-#include "client/report/DisplayLabels.h"
-#include "client/rules/DescribeReducedReferences.h"
 #include "client/text/Counted.h"
 #include "client/text/DisplayText.h"
 #include "client/text/SomeOf.h"
@@ -39,15 +38,15 @@ namespace {
 // Writes the statements, each kind by a function of its own. A kind that does not apply writes nothing.
 class TStatement {
   public:
-    explicit TStatement(const TComparisonReport& report) : fReport(report), fCoverage(report.coverage) {}
+    /// `classes`: what is to be said of classes.
+    TStatement(const TComparisonReport& report, const std::string& classes)
+        : fReport(report), fCoverage(report.coverage), fClasses(classes)
+    {}
 
     std::string Write()
     {
         WriteCompared();
-        WriteNotCompared();
-        WriteLeftOut();
-        WriteSharing();
-        WriteReferences();
+        fOut += fClasses;
         WriteNames();
         WriteBadValues();
         WriteLacks();
@@ -69,127 +68,6 @@ class TStatement {
                 boost::algorithm::join(counts, ", ") + ".\n";
         if (fCoverage.classesWithout > 0) {
             fOut += Counted(fCoverage.classesWithout, "class has", "classes have") + " no instances in any inventory.\n";
-        }
-    }
-
-    void WriteNotCompared()
-    {
-        WriteClasses(TCoverage::kExcludedByRules, "Not compared, because the rules exclude every property");
-        WriteClasses(TCoverage::kReachedByNoElement,
-                     "Not compared, because no element of the rules is for the class or one above it");
-        WriteClasses(TCoverage::kLeftOutByOptions, "Not compared, because of " + EscapeForDisplay(fReport.options));
-        WriteClasses(TCoverage::kNothingToCompare, "Not compared, because the class has no property to compare");
-        WriteClasses(TCoverage::kUnknownToReference, "Not compared, because " + Label(0) + " does not declare the class");
-        WriteClasses(TCoverage::kOperatingSystemMade, "Not compared, because " + Makers());
-        WriteMade();
-    }
-
-    // Of a class that is not compared since instances were made, "cimdelta made it" or, if some are real, which ones it made.
-    std::string Makers() const
-    {
-        const auto made = std::find_if(fCoverage.classes.begin(), fCoverage.classes.end(), [](const TCoverage::TClass& cls) {
-            return cls.state == TCoverage::kOperatingSystemMade && cls.HasOwnInstances();
-        });
-        return made == fCoverage.classes.end() ? "cimdelta made it"
-                                               : "cimdelta made the instance of " + DisplayLabels(fReport, made->madeIn);
-    }
-
-    // An operating system that is compared, but not in the inventories that have none of their own.
-    void WriteMade()
-    {
-        for (const TCoverage::TClass& cls : fCoverage.classes) {
-            if (cls.state == TCoverage::kCompared && !cls.madeIn.empty()) {
-                fOut += EscapeForDisplay(cls.name) + " not compared in " + DisplayLabels(fReport, cls.madeIn) +
-                        ", because cimdelta made the instance there.\n";
-            }
-        }
-    }
-
-    void WriteClasses(TCoverage::EState state, const std::string& title)
-    {
-        std::vector<std::string> classes;
-        for (const TCoverage::TClass& cls : fCoverage.classes) {
-            if (cls.state == state) {
-                classes.push_back(EscapeForDisplay(cls.name) + (cls.HasOwnInstances() ? " (" + Counts(cls.instances) + ")" : ""));
-            }
-        }
-        if (!classes.empty()) {
-            fOut += title + ": " + boost::algorithm::join(classes, ", ") + ".\n";
-        }
-    }
-
-    // "12 / 0 / 7", in the order of the inventories.
-    static std::string Counts(const std::vector<std::size_t>& counts)
-    {
-        std::vector<std::string> texts;
-        for (const std::size_t count : counts) {
-            texts.push_back(std::to_string(count));
-        }
-        return boost::algorithm::join(texts, " / ");
-    }
-
-    void WriteLeftOut()
-    {
-        for (const TCoverage::TClass& cls : fCoverage.classes) {
-            const std::string name = EscapeForDisplay(cls.name);
-            WriteLeftOut(cls, TCoverage::kLeftOutByRules,
-                         "Properties of " + name + " not compared, because the rules leave them out");
-            WriteLeftOut(cls, TCoverage::kSelectedOut,
-                         "Properties of " + name + " not compared, because of " + EscapeForDisplay(fReport.options));
-            WriteLeftOut(cls, TCoverage::kTimeOfCollection,
-                         "Property of " + name + " not compared, because it is the time of collection");
-            WriteLeftOut(cls, TCoverage::kNotDeclared,
-                         "Properties of " + name + " not compared, because " + Label(0) + " does not declare them");
-            WriteLeftOut(cls, TCoverage::kUsedAsKey, "Properties of " + name + " used as keys, not compared as properties");
-        }
-    }
-
-    void WriteLeftOut(const TCoverage::TClass& cls, TCoverage::EReason reason, const std::string& title)
-    {
-        std::vector<std::string> names;
-        for (const TCoverage::TLeftOut& leftOut : cls.leftOut) {
-            if (leftOut.reason == reason) {
-                names.push_back(leftOut.property);
-            }
-        }
-        if (!names.empty()) {
-            fOut += title + ": " + EscapeForDisplay(SomeOf(names)) + ".\n";
-        }
-    }
-
-    void WriteSharing()
-    {
-        for (const TCoverage::TClass& cls : fCoverage.classes) {
-            std::vector<std::string> groups;
-            for (std::size_t i = 0; i < cls.sharing.size(); ++i) {
-                AddSharing(groups, i, cls.sharing[i] - cls.sharingAlone[i],
-                           i == 0 ? "not compared" : "compared with the same instance of " + Label(0) + " as the earlier one");
-                AddSharing(groups, i, cls.sharingAlone[i],
-                           "reported with the earlier one, since " + Label(0) + " has none with that key");
-            }
-            if (!groups.empty()) {
-                fOut += "Instances of " + EscapeForDisplay(cls.name) +
-                        " with the key of an earlier one, since the rules leave out " +
-                        EscapeForDisplay(boost::algorithm::join(cls.ignoredKeys, ", ")) + ": " +
-                        boost::algorithm::join(groups, "; ") + ".\n";
-            }
-        }
-    }
-
-    void AddSharing(std::vector<std::string>& groups, std::size_t inventory, std::size_t count, const std::string& fate) const
-    {
-        if (count > 0) {
-            groups.push_back(std::to_string(count) + " of " + Label(inventory) + ", " + fate);
-        }
-    }
-
-    void WriteReferences()
-    {
-        for (const TCoverage::TClass& cls : fCoverage.classes) {
-            if (cls.reducedReferences) {
-                fOut += "References of " + EscapeForDisplay(cls.name) + " were compared " +
-                        EscapeForDisplay(DescribeReducedReferences(cls.referenceKeys)) + ".\n";
-            }
         }
     }
 
@@ -360,6 +238,7 @@ class TStatement {
 
     const TComparisonReport& fReport;
     const TCoverage& fCoverage;
+    std::string fClasses;
     std::string fOut;
 };
 
@@ -367,10 +246,12 @@ class TStatement {
 
 std::string WriteTextCoverage(const TComparisonReport& report)
 {
-    if (report.run) {
-        return WriteTextCoverage(*report.run);
-    }
-    return TStatement(report).Write();
+    return report.run ? WriteTextCoverage(*report.run) : TStatement(report, WriteGatheredClasses(report)).Write();
+}
+
+std::string WriteDetailedCoverage(const TComparisonReport& report)
+{
+    return report.run ? WriteDetailedCoverage(*report.run) : TStatement(report, WriteEachClass(report)).Write();
 }
 
 }  // namespace NORVZEL20

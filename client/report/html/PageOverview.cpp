@@ -181,7 +181,7 @@ TJson MakePageOverview(const TComparisonReport& report, const TPageData& data)
                          {"digest", Sha256Hex(report.options.empty() ? report.rulesText : report.meaning->GetText())},
                          {"text", report.areRulesMade ? std::string() : report.rulesText}};
     overview["baseline"] = BaselineOf(report);
-    overview["coverage"] = LinesOf(WriteTextCoverage(report));
+    overview["coverage"] = LinesOf(WriteDetailedCoverage(report));
     return overview;
 }
 
