@@ -45,52 +45,60 @@ TEST_F(UsageTest, EachCommandKnowsTheVersion)
     }
 }
 
+struct TWrongUsage {
+    std::vector<std::string> arguments;
+    std::string message;
+};
+
+const std::string kCommands = "compare, noise, check, explain, query, show or collect; see cimdelta --help";
+
+const std::vector<TWrongUsage> kWrongCommands = {
+    {{}, "name a command: " + kCommands},
+    {{""}, "name a command: " + kCommands},
+    {{"compar", "web01.xml", "web02.xml"}, "compar is no command; did you mean compare?"},
+    {{"compar", "--help"}, "compar is no command; did you mean compare?"},
+    {{"help", "shwo"}, "shwo is no command; did you mean show?"},
+    {{"hlep"}, "hlep is no command; did you mean help?"},
+    {{"help", "hlep"}, "hlep is no command; did you mean help?"},
+    {{"help", "compare", "show"}, "show is one argument too many; see cimdelta --help"},
+    {{"help", "help", "show", "check"}, "show is one argument too many; see cimdelta --help"},
+    {{"help", "--nonsense"}, "--nonsense is one argument too many; see cimdelta --help"},
+    {{"help", "compare", "--nonsense"}, "--nonsense is one argument too many; see cimdelta --help"},
+    {{"compare", "--own", "web01.xml", "web02.xml"}, "--own is no option of cimdelta compare; see cimdelta compare --help"},
+    {{"help", "merge"}, "merge is no command; name one: " + kCommands},
+    {{"web01.xml", "web02.xml"}, "web01.xml is no command; name one: " + kCommands},
+    {{"--verson"}, "--verson is no option of cimdelta; did you mean --version?"},
+    {{"--spec", "rules.xml", "compare", "web01.xml", "web02.xml"},
+     "--spec is an option of compare; put it behind the command: cimdelta compare --spec"},
+};
+
+const std::vector<TWrongUsage> kWrongArguments = {
+    {{"explain", "INV_Disk"}, "--schema is required; see cimdelta explain --help"},
+    {{"compare", "web01.xml"}, "OTHER is required; see cimdelta compare --help"},
+    {{"compare", "--ouput", "report", "web01.xml", "web02.xml"},
+     "--ouput is no option of cimdelta compare; did you mean --output?"},
+    {{"compare", "--spek=rules.xml", "web01.xml", "web02.xml"}, "--spek is no option of cimdelta compare; did you mean --spec?"},
+    {{"explain", "A", "--schma", "web01.xml", "--spec", "rules.xml"},
+     "--schma is no option of cimdelta explain; did you mean --schema?"},
+    {{"compare", "web01.xml", "web02.xml", "--wrong"}, "--wrong is no option of cimdelta compare; see cimdelta compare --help"},
+    {{"compare", "-x", "web01.xml", "web02.xml"}, "-x is no option of cimdelta compare; see cimdelta compare --help"},
+    {{"show", "a", "b", "c"}, "c is one argument too many; see cimdelta show --help"},
+    {{"check", "a", "b", "c"}, "b, c are 2 arguments too many; see cimdelta check --help"},
+    {{"compare", "--spec", "a", "--spec", "b", "web01.xml", "web02.xml"},
+     "--spec can be given only once; see cimdelta compare --help"},
+    {{"show", "-o", "json", "--format=json", "web01.xml"}, "-o,--format can be given only once; see cimdelta show --help"},
+    {{"compare", "web01.xml", "web02.xml", "--spec"}, "--spec needs a value; see cimdelta compare --help"},
+    {{"show", "web01.xml", "-o"}, "-o,--format needs a value; see cimdelta show --help"},
+    {{"compare", "-o", "xls", "web01.xml", "web02.xml"},
+     "xls is no format; name one: text, json, ndjson, cimxml, csv, markdown or html; see cimdelta compare --help"},
+};
+
 TEST_F(UsageTest, WrongUsageIsReportedInOneLine)
 {
-    const char kCommands[] = "compare, noise, check, explain, query, show or collect; see cimdelta --help";
-    const struct {
-        std::vector<std::string> arguments;
-        std::string message;
-    } rows[] = {
-        {{}, std::string("name a command: ") + kCommands},
-        {{""}, std::string("name a command: ") + kCommands},
-        {{"compar", "web01.xml", "web02.xml"}, "compar is no command; did you mean compare?"},
-        {{"compar", "--help"}, "compar is no command; did you mean compare?"},
-        {{"help", "shwo"}, "shwo is no command; did you mean show?"},
-        {{"hlep"}, "hlep is no command; did you mean help?"},
-        {{"help", "hlep"}, "hlep is no command; did you mean help?"},
-        {{"help", "compare", "show"}, "show is one argument too many; see cimdelta --help"},
-        {{"help", "help", "show", "check"}, "show is one argument too many; see cimdelta --help"},
-        {{"help", "--nonsense"}, "--nonsense is one argument too many; see cimdelta --help"},
-        {{"help", "compare", "--nonsense"}, "--nonsense is one argument too many; see cimdelta --help"},
-        {{"compare", "--own", "web01.xml", "web02.xml"}, "--own is no option of cimdelta compare; see cimdelta compare --help"},
-        {{"help", "merge"}, std::string("merge is no command; name one: ") + kCommands},
-        {{"web01.xml", "web02.xml"}, std::string("web01.xml is no command; name one: ") + kCommands},
-        {{"--verson"}, "--verson is no option of cimdelta; did you mean --version?"},
-        {{"--spec", "rules.xml", "compare", "web01.xml", "web02.xml"},
-         "--spec is an option of compare; put it behind the command: cimdelta compare --spec"},
-        {{"explain", "INV_Disk"}, "--schema is required; see cimdelta explain --help"},
-        {{"compare", "web01.xml"}, "OTHER is required; see cimdelta compare --help"},
-        {{"compare", "--ouput", "report", "web01.xml", "web02.xml"},
-         "--ouput is no option of cimdelta compare; did you mean --output?"},
-        {{"compare", "--spek=rules.xml", "web01.xml", "web02.xml"},
-         "--spek is no option of cimdelta compare; did you mean --spec?"},
-        {{"explain", "A", "--schma", "web01.xml", "--spec", "rules.xml"},
-         "--schma is no option of cimdelta explain; did you mean --schema?"},
-        {{"compare", "web01.xml", "web02.xml", "--wrong"}, "--wrong is no option of cimdelta compare; see cimdelta compare --help"},
-        {{"compare", "-x", "web01.xml", "web02.xml"}, "-x is no option of cimdelta compare; see cimdelta compare --help"},
-        {{"show", "a", "b", "c"}, "c is one argument too many; see cimdelta show --help"},
-        {{"check", "a", "b", "c"}, "b, c are 2 arguments too many; see cimdelta check --help"},
-        {{"compare", "--spec", "a", "--spec", "b", "web01.xml", "web02.xml"},
-         "--spec can be given only once; see cimdelta compare --help"},
-        {{"show", "-o", "json", "--format=json", "web01.xml"}, "-o,--format can be given only once; see cimdelta show --help"},
-        {{"compare", "web01.xml", "web02.xml", "--spec"}, "--spec needs a value; see cimdelta compare --help"},
-        {{"show", "web01.xml", "-o"}, "-o,--format needs a value; see cimdelta show --help"},
-        {{"compare", "-o", "xls", "web01.xml", "web02.xml"},
-         "xls is no format; name one: text, json, ndjson, cimxml, csv, markdown or html; see cimdelta compare --help"},
-    };
-    for (const auto& row : rows) {
-        EXPECT_EQ("cimdelta: " + row.message + "\n", Complaint(row.arguments));
+    for (const std::vector<TWrongUsage>& rows : {kWrongCommands, kWrongArguments}) {
+        for (const TWrongUsage& row : rows) {
+            EXPECT_EQ("cimdelta: " + row.message + "\n", Complaint(row.arguments));
+        }
     }
 }
 

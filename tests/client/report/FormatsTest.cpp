@@ -37,51 +37,54 @@ class FormatsTest : public TClientFixture {
     }
 };
 
+/// The four differences of the three systems.
+const char kDifferences[] =
+    "{\"kind\":\"onlyInReference\",\"class\":\"INV_Disk\",\"instance\":\"INV_Disk.BootId=1,Device=\\\"sda\\\"\",\"keys\":"
+    "{\"Device\":\"sda\",\"BootId\":1},"
+    "\"inventories\":[\"web02\"],\"contents\":{\"SizeMB\":{\"type\":\"uint32\",\"value\":500},"
+    "\"Model\":{\"type\":\"string\",\"value\":\"A 1\"}}}\n"
+    "{\"kind\":\"onlyInOthers\",\"class\":\"INV_Disk\",\"instance\":\"INV_Disk.BootId=7,Device=\\\"sda\\\"\",\"keys\":{"
+    "\"Device\":\"sda\",\"BootId\":7},"
+    "\"inventories\":[\"web02\"],\"contents\":{\"SizeMB\":{\"type\":\"uint32\",\"value\":500},"
+    "\"Model\":{\"type\":\"string\",\"value\":\"A 1\"}}}\n"
+    "{\"kind\":\"changed\",\"class\":\"INV_Service\",\"instance\":\"INV_Service.Id=\\\"ssh\\\"\",\"keys\":{\"Id\":"
+    "\"ssh\"},\"inventories\":[\"web03\"],"
+    "\"property\":\"Caption\",\"reference\":{\"type\":\"string\",\"value\":\"Secure shell\"},"
+    "\"others\":[{\"inventories\":[\"web03\"],\"type\":\"string\",\"value\":\"Secure\\nshell \u009b31m\"}]}\n"
+    "{\"kind\":\"changed\",\"class\":\"INV_Service\",\"instance\":\"INV_Service.Id=\\\"ssh\\\"\",\"keys\":{\"Id\":"
+    "\"ssh\"},\"inventories\":[\"web02\"],"
+    "\"property\":\"Started\",\"reference\":{\"type\":\"boolean\",\"value\":true},"
+    "\"others\":[{\"inventories\":[\"web02\"],\"type\":\"boolean\",\"value\":false}]}\n";
+
 TEST_F(FormatsTest, NdjsonHasADocumentForEachDifferenceAndOneForTheCoverage)
 {
-    EXPECT_EQ(
-        std::string(
-            "{\"kind\":\"onlyInReference\",\"class\":\"INV_Disk\",\"instance\":\"INV_Disk.BootId=1,Device=\\\"sda\\\"\",\"keys\":"
-            "{\"Device\":\"sda\",\"BootId\":1},"
-            "\"inventories\":[\"web02\"],\"contents\":{\"SizeMB\":{\"type\":\"uint32\",\"value\":500},"
-            "\"Model\":{\"type\":\"string\",\"value\":\"A 1\"}}}\n"
-            "{\"kind\":\"onlyInOthers\",\"class\":\"INV_Disk\",\"instance\":\"INV_Disk.BootId=7,Device=\\\"sda\\\"\",\"keys\":{"
-            "\"Device\":\"sda\",\"BootId\":7},"
-            "\"inventories\":[\"web02\"],\"contents\":{\"SizeMB\":{\"type\":\"uint32\",\"value\":500},"
-            "\"Model\":{\"type\":\"string\",\"value\":\"A 1\"}}}\n"
-            "{\"kind\":\"changed\",\"class\":\"INV_Service\",\"instance\":\"INV_Service.Id=\\\"ssh\\\"\",\"keys\":{\"Id\":"
-            "\"ssh\"},\"inventories\":[\"web03\"],"
-            "\"property\":\"Caption\",\"reference\":{\"type\":\"string\",\"value\":\"Secure shell\"},"
-            "\"others\":[{\"inventories\":[\"web03\"],\"type\":\"string\",\"value\":\"Secure\\nshell \u009b31m\"}]}\n"
-            "{\"kind\":\"changed\",\"class\":\"INV_Service\",\"instance\":\"INV_Service.Id=\\\"ssh\\\"\",\"keys\":{\"Id\":"
-            "\"ssh\"},\"inventories\":[\"web02\"],"
-            "\"property\":\"Started\",\"reference\":{\"type\":\"boolean\",\"value\":true},"
-            "\"others\":[{\"inventories\":[\"web02\"],\"type\":\"boolean\",\"value\":false}]}\n"
-            "{\"kind\":\"coverage\",\"inventories\":[") +
-            Inventory("web01", "reference", 0) + "," + Inventory("web02", "other", 3) + "," + Inventory("web03", "other", 1) +
-            "],\"summary\":{\"differences\":4,\"onlyInReference\":1,\"onlyInOthers\":1,\"changedValues\":2,\"changedInstances\":1,"
-            "\"instancesOnlyInOthers\":1,\"everythingCompared\":false,\"nothingCompared\":false,\"classes\":["
-            "{\"class\":\"INV_Disk\",\"onlyInReference\":1,\"onlyInOthers\":1,\"changedValues\":0,\"changedInstances\":0},"
-            "{\"class\":\"INV_Service\",\"onlyInReference\":0,\"onlyInOthers\":0,\"changedValues\":2,\"changedInstances\":1}]},"
-            "\"groups\":["
-            "{\"class\":\"INV_Disk\",\"kind\":\"onlyInReference\",\"inventories\":[\"web02\"],\"instances\":1,"
-            "\"examples\":[\"INV_Disk.BootId=1,Device=\\\"sda\\\"\"]},"
-            "{\"class\":\"INV_Disk\",\"kind\":\"onlyInOthers\",\"inventories\":[\"web02\"],\"instances\":1,"
-            "\"examples\":[\"INV_Disk.BootId=7,Device=\\\"sda\\\"\"]}," +
-            GroupOfService("Caption", "web03", "\"string\",\"value\":\"Secure shell\"",
-                           "\"string\",\"value\":\"Secure\\nshell \u009b31m\"") +
-            "," + GroupOfService("Started", "web02", "\"boolean\",\"value\":true", "\"boolean\",\"value\":false") +
-            "],"
-            "\"classes\":[" +
-            CoveredClass("INV_Disk", "compared", "1,1,1", "1,1,1") + "," +
-            CoveredClass("INV_Package", "reachedByNoElement", "3,3,4", "0,0,0") + "," +
-            CoveredClass("INV_Service", "compared", "1,1,1", "1,1,1") + "," +
-            CoveredClass("KALMO_OperatingSystem", "reachedByNoElement", "1,1,1", "0,0,0") +
-            "],\"classesWithoutInstances\":1,\"schema\":[],\"badValues\":[],\"systemNames\":[],\"hints\":[]}\n",
-        Result({"compare", "--detail", "-o", "ndjson", "--spec",
-                Scratch("rules", "<DifftoolSpec><class name='INV_Disk' default='include'/><class name='INV_Element' "
-                                 "default='include'/></DifftoolSpec>"),
-                "web01.xml", "web02.xml", "web03.xml"}));
+    const std::string coverage =
+        std::string("{\"kind\":\"coverage\",\"inventories\":[") + Inventory("web01", "reference", 0) + "," +
+        Inventory("web02", "other", 3) + "," + Inventory("web03", "other", 1) +
+        "],\"summary\":{\"differences\":4,\"onlyInReference\":1,\"onlyInOthers\":1,\"changedValues\":2,\"changedInstances\":1,"
+        "\"instancesOnlyInOthers\":1,\"everythingCompared\":false,\"nothingCompared\":false,\"classes\":["
+        "{\"class\":\"INV_Disk\",\"onlyInReference\":1,\"onlyInOthers\":1,\"changedValues\":0,\"changedInstances\":0},"
+        "{\"class\":\"INV_Service\",\"onlyInReference\":0,\"onlyInOthers\":0,\"changedValues\":2,\"changedInstances\":1}]},"
+        "\"groups\":["
+        "{\"class\":\"INV_Disk\",\"kind\":\"onlyInReference\",\"inventories\":[\"web02\"],\"instances\":1,"
+        "\"examples\":[\"INV_Disk.BootId=1,Device=\\\"sda\\\"\"]},"
+        "{\"class\":\"INV_Disk\",\"kind\":\"onlyInOthers\",\"inventories\":[\"web02\"],\"instances\":1,"
+        "\"examples\":[\"INV_Disk.BootId=7,Device=\\\"sda\\\"\"]}," +
+        GroupOfService("Caption", "web03", "\"string\",\"value\":\"Secure shell\"",
+                       "\"string\",\"value\":\"Secure\\nshell \u009b31m\"") +
+        "," + GroupOfService("Started", "web02", "\"boolean\",\"value\":true", "\"boolean\",\"value\":false") +
+        "],"
+        "\"classes\":[" +
+        CoveredClass("INV_Disk", "compared", "1,1,1", "1,1,1") + "," +
+        CoveredClass("INV_Package", "reachedByNoElement", "3,3,4", "0,0,0") + "," +
+        CoveredClass("INV_Service", "compared", "1,1,1", "1,1,1") + "," +
+        CoveredClass("KALMO_OperatingSystem", "reachedByNoElement", "1,1,1", "0,0,0") +
+        "],\"classesWithoutInstances\":1,\"schema\":[],\"badValues\":[],\"systemNames\":[],\"hints\":[]}\n";
+    EXPECT_EQ(kDifferences + coverage,
+              Result({"compare", "--detail", "-o", "ndjson", "--spec",
+                      Scratch("rules", "<DifftoolSpec><class name='INV_Disk' default='include'/><class name='INV_Element' "
+                                       "default='include'/></DifftoolSpec>"),
+                      "web01.xml", "web02.xml", "web03.xml"}));
 }
 
 TEST_F(FormatsTest, JsonHoldsWhatNdjsonHolds)
