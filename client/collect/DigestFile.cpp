@@ -5,7 +5,9 @@
 
 #include <algorithm>
 #include <array>
+#include <boost/algorithm/hex.hpp>
 #include <cerrno>
+#include <iterator>
 #include <memory>
 #include <new>
 #include <string_view>
@@ -44,15 +46,11 @@ class TDigest {
 
     std::string GetText()
     {
-        constexpr char kDigits[] = "0123456789abcdef";
         std::array<unsigned char, EVP_MAX_MD_SIZE> bytes{};
         unsigned int length = 0;
         EVP_DigestFinal_ex(fContext.get(), bytes.data(), &length);
         std::string text = "sha256:";
-        for (unsigned int i = 0; i < length; ++i) {
-            text += kDigits[bytes[i] >> 4U];
-            text += kDigits[bytes[i] & 0xFU];
-        }
+        boost::algorithm::hex_lower(bytes.begin(), bytes.begin() + length, std::back_inserter(text));
         return text;
     }
 

@@ -3,6 +3,7 @@
 #include <sys/stat.h>
 #include <unistd.h>
 
+#include <boost/algorithm/hex.hpp>
 #include <boost/algorithm/string/join.hpp>
 #include <cctype>
 #include <cerrno>
@@ -192,7 +193,6 @@ class TNewFolder {
 
 std::string FileNameOfNamespace(const std::string& namespaceName)
 {
-    constexpr std::string_view kDigits = "0123456789ABCDEF";
     std::string name;
     for (const char c : namespaceName) {
         const auto byte = static_cast<unsigned char>(c);
@@ -201,9 +201,7 @@ std::string FileNameOfNamespace(const std::string& namespaceName)
         } else if (c == '/') {
             name += '-';
         } else {
-            name += '%';
-            name += kDigits[byte / 16];
-            name += kDigits[byte % 16];
+            name += "%" + boost::algorithm::hex(std::string(1, c));
         }
     }
     return name + ".xml";

@@ -1,6 +1,7 @@
 #include "client/wbem/TWbemRequest.h"
 
 #include <algorithm>
+#include <boost/algorithm/hex.hpp>
 #include <cctype>
 #include <string_view>
 
@@ -92,16 +93,13 @@ std::string WriteWbemRequest(const TWbemRequest& request)
 std::string EncodeForHeader(const std::string& namespaceName)
 {
     constexpr std::string_view kPlain = "-._~/";
-    constexpr std::string_view kDigits = "0123456789ABCDEF";
     std::string encoded;
     for (const char c : namespaceName) {
         const auto byte = static_cast<unsigned char>(c);
         if (std::isalnum(byte) != 0 || kPlain.find(c) != std::string_view::npos) {
             encoded += c;
         } else {
-            encoded += '%';
-            encoded += kDigits[byte / 16];
-            encoded += kDigits[byte % 16];
+            encoded += "%" + boost::algorithm::hex(std::string(1, c));
         }
     }
     return encoded;

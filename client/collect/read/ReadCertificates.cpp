@@ -16,7 +16,9 @@
 #include <openssl/x509v3.h>
 
 #include <algorithm>
+#include <boost/algorithm/hex.hpp>
 #include <ctime>
+#include <iterator>
 #include <map>
 #include <memory>
 #include <new>
@@ -69,11 +71,7 @@ std::string FingerprintOf(const X509& certificate)
     unsigned int length = 0;
     std::string text;
     if (X509_digest(&certificate, EVP_sha256(), digest, &length) == 1) {
-        constexpr char kDigits[] = "0123456789abcdef";
-        for (unsigned int i = 0; i < length; ++i) {
-            text += kDigits[digest[i] >> 4U];
-            text += kDigits[digest[i] & 0xFU];
-        }
+        boost::algorithm::hex_lower(digest, digest + length, std::back_inserter(text));
     }
     return text;
 }

@@ -1,24 +1,11 @@
 #include "client/collect/read/ValidText.h"
 
+#include <boost/algorithm/hex.hpp>
+
 #include "embedded/value/IsXmlCharacter.h"
 #include "embedded/value/TUtf8.h"
 
 namespace NORVZEL20 {
-
-namespace {
-
-void AppendHexadecimal(std::string& out, std::string_view bytes)
-{
-    constexpr char kDigits[] = "0123456789ABCDEF";
-    for (const char byte : bytes) {
-        const auto code = static_cast<unsigned char>(byte);
-        out += "\\x";
-        out += kDigits[code >> 4U];
-        out += kDigits[code & 0xFU];
-    }
-}
-
-}  // namespace
 
 std::string ValidText(std::string_view bytes)
 {
@@ -31,7 +18,9 @@ std::string ValidText(std::string_view bytes)
         if (isValid && IsXmlCharacter(character.code)) {
             text += piece;
         } else {
-            AppendHexadecimal(text, piece);
+            for (const char byte : piece) {
+                text += "\\x" + boost::algorithm::hex(std::string(1, byte));
+            }
         }
         bytes.remove_prefix(piece.size());
     }

@@ -2,6 +2,7 @@
 
 #include <openssl/evp.h>
 
+#include <boost/algorithm/hex.hpp>
 #include <new>
 
 namespace NORVZEL20 {
@@ -19,14 +20,7 @@ std::string Sha256(std::string_view text)
 
 std::string Sha256Hex(std::string_view text)
 {
-    constexpr char kDigits[] = "0123456789abcdef";
-    std::string hex;
-    for (const char byte : Sha256(text)) {
-        const auto number = static_cast<unsigned char>(byte);
-        hex += kDigits[number >> 4U];
-        hex += kDigits[number & 0xFU];
-    }
-    return hex;
+    return boost::algorithm::hex_lower(Sha256(text));
 }
 
 }  // namespace NORVZEL20
