@@ -14,7 +14,7 @@ namespace NORVZEL20 {
 std::vector<std::string> CollectedKinds();
 
 /// Writes the inventory of a system as CIM-XML. Returns a line about each kind of which something was left out.
-/// Errors: what the sink throws, std::bad_alloc.
+/// Errors: what the sink throws, TZELException of TInventoryWriter::Add, std::bad_alloc.
 std::vector<std::string> CollectInventory(const TSystemRoot& root, ISystemCalls& calls, const TCollectionOptions& options,
                                           const TCimXmlWriter::TSink& sink);
 

@@ -4,6 +4,7 @@
 // known only while the adapter is on; reading them fails otherwise.
 #include <algorithm>
 #include <map>
+#include <system_error>
 #include <tuple>
 
 #include "client/collect/CollectKinds.h"
@@ -79,6 +80,16 @@ void AddRoutes(TCollection& collection, const std::vector<TRoute>& routes)
     }
 }
 
+std::vector<TInterfaceAddress> AddressesOf(TCollection& collection)
+{
+    try {
+        return collection.GetCalls().Addresses();
+    } catch (const std::system_error& error) {
+        collection.LeaveOut("IPv4 addresses", error.code().message());
+        return {};
+    }
+}
+
 template <class T>
 std::vector<T> ReadTable(TCollection& collection, const std::string& path, std::vector<T> (*read)(std::string_view, TReadFaults&))
 {
@@ -104,7 +115,7 @@ void CollectNetwork(TCollection& collection)
             AddAdapter(collection, adapter.name);
         }
     }
-    AddEndpoints(collection, "IPv4", collection.GetCalls().Addresses());
+    AddEndpoints(collection, "IPv4", AddressesOf(collection));
     AddEndpoints(collection, "IPv6", ReadTable(collection, "/proc/net/if_inet6", &ReadAddresses6));
     AddRoutes(collection, ReadTable(collection, "/proc/net/route", &ReadRoutes4));
     AddRoutes(collection, ReadTable(collection, "/proc/net/ipv6_route", &ReadRoutes6));

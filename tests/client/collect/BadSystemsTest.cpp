@@ -144,10 +144,12 @@ TEST_F(BadSystemsTest, LimitOfTimeEndsWhatIsLeft)
     EXPECT_EQ(0, fStatus);
 }
 
-TEST_F(BadSystemsTest, RefusedCallsEndTheirKindAlone)
+TEST_F(BadSystemsTest, RefusedAddressesAreMissingAlone)
 {
     fSystem->fCalls.fHasNoAddresses = true;
-    EXPECT_EQ("the rest: Operation not permitted\n", LinesAbout("network"));
+    fSystem->File("/proc/net/if_inet6", "20010db8000000000000000000000005 02 40 00 80     eth0\n");
+    EXPECT_EQ("IPv4 addresses: Operation not permitted\n", LinesAbout("network"));
+    EXPECT_NE(std::string::npos, Show("KALMO_IPEndpoint").find("2001:db8::5/64"));
     EXPECT_NE(std::string::npos, Show("KALMO_User").find("web"));
 }
 
