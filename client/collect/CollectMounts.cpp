@@ -11,7 +11,6 @@
 #include "client/collect/CollectKinds.h"
 #include "client/collect/IsRemote.h"
 #include "client/collect/read/ReadMountInfo.h"
-#include "client/collect/read/TextPieces.h"
 
 namespace NORVZEL20 {
 

@@ -3,7 +3,6 @@
 // The kernel lists sockets with the number of their inode; the descriptors of a process are links that name the same number. Only
 // root may look at the descriptors of others. A UDP socket with a port from the range of those that the kernel hands out is one
 // that a program opened to ask something, not to serve, so it is left out.
-#include <algorithm>
 #include <map>
 #include <set>
 #include <tuple>
@@ -57,13 +56,17 @@ void FindPrograms(TCollection& collection, TProgramNames& programs)
     }
 }
 
+// What the kernel has if nobody sets it.
+constexpr std::uint64_t kFirstHandedOut = 32768;
+constexpr std::uint64_t kLastHandedOut = 60999;
+
 std::pair<std::uint64_t, std::uint64_t> HandedOutPorts(const TCollection& collection)
 {
     const std::string text = collection.ReadValue("/proc/sys/net/ipv4/ip_local_port_range");
     const std::vector<std::string_view> numbers = SplitAtBlanks(text);
     const std::optional<std::uint64_t> first = numbers.size() == 2 ? NumberIn(numbers[0]) : std::nullopt;
     const std::optional<std::uint64_t> last = numbers.size() == 2 ? NumberIn(numbers[1]) : std::nullopt;
-    return {first.value_or(32768), last.value_or(60999)};
+    return {first.value_or(kFirstHandedOut), last.value_or(kLastHandedOut)};
 }
 
 std::vector<std::pair<std::string, TSocket>> ReadAllSockets(TCollection& collection)

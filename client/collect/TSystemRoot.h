@@ -48,9 +48,6 @@ class TSystemRoot {
     /// Opens the folder or file for calls such as fstatvfs, without reading it.
     TDescriptor OpenPlace(const std::string& path) const;
 
-    /// Whether it is the system on which this program runs.
-    bool IsRunning() const noexcept { return fIsRunning; }
-
     /// The system's reason for a failed call as people say it.
     static std::string TroubleOf(int error);
 
