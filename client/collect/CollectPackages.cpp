@@ -1,3 +1,7 @@
+// Installed packages of dpkg and of rpm.
+//
+// Both are read from their databases, without asking a program. A system may have both, so the manager is a key; a package that is
+// installed for several architectures is an instance for each one.
 #include <algorithm>
 #include <map>
 #include <utility>
@@ -11,6 +15,8 @@ namespace NORVZEL20 {
 
 namespace {
 
+constexpr char kDpkgStatus[] = "/var/lib/dpkg/status";
+
 // dpkg writes changes here first, in files whose names are numbers, and takes them into its list later.
 void NotePendingUpdates(TCollection& collection)
 {
@@ -23,8 +29,6 @@ void NotePendingUpdates(TCollection& collection)
         collection.LeaveOut(folder, "dpkg is at work or was interrupted, so the states of some packages may be older ones");
     }
 }
-
-constexpr char kDpkgStatus[] = "/var/lib/dpkg/status";
 
 void CollectDpkg(TCollection& collection)
 {
