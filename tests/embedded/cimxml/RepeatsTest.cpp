@@ -54,6 +54,29 @@ class RepeatsTest : public testing::Test {
     }
     static std::string Port(const std::string& property) { return "<CLASS NAME=\"Port\">" + property + "</CLASS>\n"; }
 
+    /// A class whose key is of this type, and an instance of it with a name in front.
+    struct TNamedKey {
+        std::string type;
+        std::string name;      ///< the key in the name
+        std::string property;  ///< the key in the instance
+        const char* message;   ///< what is wrong, or empty
+    };
+
+    void ExpectKeys(const std::vector<TNamedKey>& rows)
+    {
+        for (const TNamedKey& row : rows) {
+            const std::string declared = row.type == "reference"
+                                             ? "<PROPERTY.REFERENCE NAME=\"Key\">" + fKey + "</PROPERTY.REFERENCE>"
+                                             : "<PROPERTY NAME=\"Key\" TYPE=\"" + row.type + "\">" + fKey + "</PROPERTY>";
+            const std::string named = Named(row.name, row.property);
+            for (const std::string& document : {Port(declared) + named, named + Port(declared)}) {
+                const std::string outcome = Outcome({document});
+                const std::size_t found = outcome.find("found ");
+                EXPECT_EQ(row.message, found == std::string::npos ? "" : outcome.substr(found)) << row.name << row.property;
+            }
+        }
+    }
+
     const std::string fDisk = L::Class("Disk", "<PROPERTY NAME=\"Size\" TYPE=\"uint64\"/>");
     const std::string fKey = "<QUALIFIER NAME=\"Key\" TYPE=\"boolean\" OVERRIDABLE=\"false\"><VALUE>TRUE</VALUE></QUALIFIER>";
     boost::shared_ptr<TInMemNamespace> fNamespace;
@@ -146,29 +169,12 @@ TEST_F(RepeatsTest, ANameOfAnotherClassIsRefused)
                        "</VALUE.OBJECTWITHLOCALPATH>"}));
 }
 
-/// The key in the name, the property, and what is wrong.
 TEST_F(RepeatsTest, AKeyInTheNameThatContradictsTheInstanceIsRefused)
 {
     const auto number = [](const std::string& text) { return "<KEYVALUE VALUETYPE=\"numeric\">" + text + "</KEYVALUE>"; };
     const auto text = [](const std::string& value) { return "<KEYVALUE VALUETYPE=\"string\">" + value + "</KEYVALUE>"; };
-    const auto path = [](const std::string& place, const std::string& id) {
-        const std::string name =
-            "<INSTANCENAME CLASSNAME=\"Disk\"><KEYBINDING NAME=\"Id\"><KEYVALUE>" + id + "</KEYVALUE></KEYBINDING></INSTANCENAME>";
-        const std::string local =
-            "<LOCALNAMESPACEPATH><NAMESPACE NAME=\"root\"/><NAMESPACE NAME=\"" + place + "\"/></LOCALNAMESPACEPATH>";
-        return "<VALUE.REFERENCE>" + (place.empty() ? name : "<LOCALINSTANCEPATH>" + local + name + "</LOCALINSTANCEPATH>") +
-               "</VALUE.REFERENCE>";
-    };
     const auto property = [](const std::string& type, const std::string& value) { return L::Property("Key", type, value); };
-    const auto reference = [](const std::string& value) {
-        return "<PROPERTY.REFERENCE NAME=\"Key\">" + value + "</PROPERTY.REFERENCE>";
-    };
-    const struct {
-        std::string type;
-        std::string name;
-        std::string property;
-        const char* message;
-    } rows[] = {
+    ExpectKeys({
         {"string", text("a"), property("string", "a"), ""},
         {"string", text("a"), property("string", "A"),
          "found \"A\" in the key \"Key\" of an instance of class \"Port\", but the name"
@@ -185,24 +191,30 @@ TEST_F(RepeatsTest, AKeyInTheNameThatContradictsTheInstanceIsRefused)
          " name in front of it says \"6\"; correct one of the two"},
         {"datetime", text("20240229110000.000000+000"), property("datetime", "20240229120000.000000+060"), ""},
         {"boolean", "<KEYVALUE VALUETYPE=\"boolean\">TRUE</KEYVALUE>", property("boolean", "true"), ""},
+    });
+}
+
+TEST_F(RepeatsTest, AReferenceInTheNameThatContradictsTheInstanceIsRefused)
+{
+    const auto path = [](const std::string& place, const std::string& id) {
+        const std::string name =
+            "<INSTANCENAME CLASSNAME=\"Disk\"><KEYBINDING NAME=\"Id\"><KEYVALUE>" + id + "</KEYVALUE></KEYBINDING></INSTANCENAME>";
+        const std::string local =
+            "<LOCALNAMESPACEPATH><NAMESPACE NAME=\"root\"/><NAMESPACE NAME=\"" + place + "\"/></LOCALNAMESPACEPATH>";
+        return "<VALUE.REFERENCE>" + (place.empty() ? name : "<LOCALINSTANCEPATH>" + local + name + "</LOCALINSTANCEPATH>") +
+               "</VALUE.REFERENCE>";
+    };
+    const auto reference = [](const std::string& value) {
+        return "<PROPERTY.REFERENCE NAME=\"Key\">" + value + "</PROPERTY.REFERENCE>";
+    };
+    ExpectKeys({
         {"reference", path("", "a"), reference(path("", "a")), ""},
         {"reference", path("here", "a"), reference(path("", "a")), ""},
         {"reference", path("here", "a"), reference(path("there", "a")), ""},
         {"reference", path("", "a"), reference(path("", "b")),
          "found \"Disk.Id=\"b\"\" in the key \"Key\" of an instance of class \"Port\", but the name in front of it says"
          " \"Disk.Id=\"a\"\"; correct one of the two"},
-    };
-    for (const auto& row : rows) {
-        const std::string declared = row.type == "reference"
-                                         ? "<PROPERTY.REFERENCE NAME=\"Key\">" + fKey + "</PROPERTY.REFERENCE>"
-                                         : "<PROPERTY NAME=\"Key\" TYPE=\"" + row.type + "\">" + fKey + "</PROPERTY>";
-        for (const bool isClassFirst : {true, false}) {
-            const std::string named = Named(row.name, row.property);
-            const std::string outcome = isClassFirst ? Outcome({Port(declared) + named}) : Outcome({named + Port(declared)});
-            const std::size_t found = outcome.find("found ");
-            EXPECT_EQ(row.message, found == std::string::npos ? "" : outcome.substr(found)) << row.name << row.property;
-        }
-    }
+    });
 }
 
 /// The names of the keys in the name, and what is wrong.
