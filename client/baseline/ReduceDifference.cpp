@@ -3,6 +3,8 @@
 #include <algorithm>
 #include <utility>
 
+#include "client/comparison/PutContent.h"
+
 namespace NORVZEL20 {
 
 namespace {
@@ -37,34 +39,24 @@ void ReduceValues(TValueDifference& values, const std::vector<std::size_t>& inve
 }
 
 // The contents are those of the first inventory, which may be another one now.
-void TakeContents(TDifference& difference, const TValueDifference& disagreement, std::size_t first)
+void TakeContents(TDifference& difference, const TValueDifference& disagreement, std::size_t first, TPropertyOrder& order)
 {
     const auto group =
         std::find_if(disagreement.others.begin(), disagreement.others.end(), [first](const TValueDifference::TGroup& candidate) {
             return std::binary_search(candidate.inventories.begin(), candidate.inventories.end(), first);
         });
-    auto& contents = difference.contents;
-    const auto known =
-        std::find_if(contents.begin(), contents.end(), [&](const auto& content) { return content.first == disagreement.property; });
-    const bool isThere = group != disagreement.others.end() && !group->value.IsNull();
-    if (isThere && known == contents.end()) {
-        contents.emplace_back(disagreement.property, group->value);
-    } else if (isThere) {
-        known->second = group->value;
-    } else if (known != contents.end()) {
-        contents.erase(known);
-    }
+    PutContent(difference, disagreement.property, group == disagreement.others.end() ? TCIMValue() : group->value, order);
 }
 
 }  // namespace
 
-TDifference ReduceDifference(TDifference difference, const std::vector<std::size_t>& inventories)
+TDifference ReduceDifference(TDifference difference, const std::vector<std::size_t>& inventories, TPropertyOrder& order)
 {
     const bool hasOtherFirst = difference.inventories.front() != inventories.front();
     difference.inventories = inventories;
     if (difference.kind == TDifference::kOnlyInOthers && hasOtherFirst) {
         for (const TValueDifference& disagreement : difference.values) {
-            TakeContents(difference, disagreement, inventories.front());
+            TakeContents(difference, disagreement, inventories.front(), order);
         }
     }
     for (TValueDifference& values : difference.values) {

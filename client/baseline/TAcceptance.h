@@ -26,6 +26,7 @@ class TAcceptance {
     {}
 
     const TBaseline& GetBaseline() const { return *fBaseline; }
+    const TInventory& GetReference() const { return fReport.inventories->front(); }
     const std::string& LabelOf(std::size_t inventory) const { return fReport.labels[inventory]; }
 
     /// The entry for one of the inventories of a difference, whatever its values.

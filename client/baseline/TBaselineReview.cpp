@@ -6,8 +6,6 @@
 #include <algorithm>
 #include <utility>
 
-#include "client/baseline/ReduceDifference.h"
-
 namespace NORVZEL20 {
 
 namespace {
@@ -82,7 +80,7 @@ void TBaselineReview::AddChanged(const TAcceptedDifference& present, std::size_t
 void TBaselineReview::Count(const TDifference& difference, const std::vector<std::size_t>& left)
 {
     const bool areMany = difference.kind == TDifference::kOnlyInOthers;
-    fCounter.Add(difference.kind, difference.instance, areMany ? ReduceDifference(difference, left).CountInstances() : 1);
+    fCounter.Add(difference.kind, difference.instance, areMany ? difference.CountInstances(left) : 1);
 }
 
 void TBaselineReview::SortOut()

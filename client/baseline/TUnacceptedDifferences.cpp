@@ -6,6 +6,7 @@ namespace NORVZEL20 {
 
 void TUnacceptedDifferences::ForEach(const TCallback& callback)
 {
+    TPropertyOrder order(fAcceptance->GetReference());
     fAll->ForEach([&](const TDifference& difference) {
         const TDifferenceStates states(difference);
         std::vector<std::size_t> left;
@@ -17,7 +18,7 @@ void TUnacceptedDifferences::ForEach(const TCallback& callback)
         if (left.size() == difference.inventories.size()) {
             callback(difference);
         } else if (!left.empty()) {
-            callback(ReduceDifference(difference, left));
+            callback(ReduceDifference(difference, left, order));
         }
     });
 }

@@ -68,10 +68,13 @@ struct TDifference {
     }
 
     /// How many instances the difference is about: as many as the inventory has that has most instances with the key.
-    std::size_t CountInstances() const
+    std::size_t CountInstances() const { return CountInstances(inventories); }
+
+    /// The same for some of its inventories.
+    std::size_t CountInstances(const std::vector<std::size_t>& someInventories) const
     {
         std::size_t most = 1;
-        for (const std::size_t inventory : inventories) {
+        for (const std::size_t inventory : someInventories) {
             most = std::max(most, CountSharing(inventory));
         }
         return most;

@@ -9,18 +9,16 @@
 #include "client/comparison/TInstanceVotes.h"
 
 #include <algorithm>
-#include <map>
 #include <set>
 
 #include "client/comparison/EmbeddedParts.h"
-#include "client/inventory/FindDeclarations.h"
+#include "client/comparison/PutContent.h"
 
 namespace NORVZEL20 {
 
 namespace {
 
 using TGroups = std::vector<TValueDifference::TGroup>;
-using TContents = std::vector<std::pair<std::string, TCIMValue>>;
 
 // The majority stands in front of the inventories of the run.
 std::vector<std::size_t> BehindMajority(std::vector<std::size_t> inventories)
@@ -39,31 +37,11 @@ TGroups BehindMajority(TGroups groups)
     return groups;
 }
 
-bool IsKey(const TDifference& difference, const std::string& property)
-{
-    return std::any_of(difference.keys.begin(), difference.keys.end(), [&](const auto& key) { return key.first == property; });
-}
-
-// The positions of the properties in the class; the names are as the class spells them.
-std::map<std::string, std::size_t> OrderOf(const TInventory& inventory, const std::string& className)
-{
-    std::map<std::string, std::size_t> order;
-    const boost::shared_ptr<ICIMClass> cls = FindClass(*inventory.ns, className);
-    if (cls) {
-        const auto add = [&order](const boost::shared_ptr<ICIMPropertyDecl>& declaration) {
-            order.emplace(declaration->GetName(TCallContext()), order.size());
-            return true;
-        };
-        cls->EnumeratePropertyDecls(add, TCallContext());
-    }
-    return order;
-}
-
 }  // namespace
 
-TInstanceVotes::TInstanceVotes(const std::vector<TDifference>& differences, const std::vector<TInventory>& inventories,
-                               const std::vector<std::size_t>& uncompared)
-    : fDifferences(differences), fInventories(inventories)
+TInstanceVotes::TInstanceVotes(const std::vector<TDifference>& differences, std::size_t inventories,
+                               const std::vector<std::size_t>& uncompared, TPropertyOrder& order)
+    : fDifferences(differences), fOrder(order), fStates(inventories)
 {
     FindStates(uncompared);
     for (const TDifference& difference : differences) {
@@ -76,7 +54,7 @@ TInstanceVotes::TInstanceVotes(const std::vector<TDifference>& differences, cons
 void TInstanceVotes::FindStates(const std::vector<std::size_t>& uncompared)
 {
     const bool referenceHas = fDifferences.front().kind != TDifference::kOnlyInOthers;
-    fStates.assign(fInventories.size(), referenceHas ? kHas : kLacks);
+    std::fill(fStates.begin(), fStates.end(), referenceHas ? kHas : kLacks);
     for (const TDifference& difference : fDifferences) {
         for (const std::size_t inventory : difference.inventories) {
             fStates[inventory] = difference.kind == TDifference::kOnlyInReference ? kLacks : kHas;
@@ -201,7 +179,7 @@ TDifference TInstanceVotes::Missing() const
     missing.path = fDifferences.front().path;
     missing.contents = fDifferences.front().contents;
     for (const TProperty& property : fProperties) {
-        AddWinner(missing.contents, property);
+        PutContent(missing, property.name, property.values[property.winner].value, fOrder);
     }
     return missing;
 }
@@ -215,27 +193,6 @@ TDifference TInstanceVotes::Extra() const
         AddEmbeddedParts(extra.values.back(), false);
     }
     return extra;
-}
-
-// Puts the value that most have in the place of that which the contents have, which are those of the first inventory.
-void TInstanceVotes::AddWinner(TContents& contents, const TProperty& property) const
-{
-    if (IsKey(fDifferences.front(), property.name)) {
-        return;
-    }
-    const TCIMValue& value = property.values[property.winner].value;
-    const auto known =
-        std::find_if(contents.begin(), contents.end(), [&](const auto& content) { return content.first == property.name; });
-    if (known != contents.end() && !value.IsNull()) {
-        known->second = value;
-    } else if (known != contents.end()) {
-        contents.erase(known);
-    } else if (!value.IsNull()) {
-        std::map<std::string, std::size_t> order = OrderOf(fInventories.front(), fDifferences.front().className);
-        const auto behind = std::find_if(contents.begin(), contents.end(),
-                                         [&](const auto& content) { return order[property.name] < order[content.first]; });
-        contents.emplace(behind, property.name, value);
-    }
 }
 
 // Without inventories if nobody differs.

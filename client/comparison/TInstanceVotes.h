@@ -5,18 +5,18 @@
 #include <vector>
 
 #include "client/comparison/TDifference.h"
-#include "client/inventory/TInventory.h"
+#include "client/comparison/TPropertyOrder.h"
 
 namespace NORVZEL20 {
 
 /// What all inventories of a run have of one instance, and what most of them have. TMajorityView says how that is found.
 class TInstanceVotes {
   public:
-    /// `differences` are all those of the instance, at least one, of a run with `inventories`. Those of them that are in
-    /// `uncompared` were not compared in the class, and neither have the instance nor lack it. The differences and the inventories
-    /// must outlive this.
-    TInstanceVotes(const std::vector<TDifference>& differences, const std::vector<TInventory>& inventories,
-                   const std::vector<std::size_t>& uncompared);
+    /// `differences` are all those of the instance, at least one, of a run with so many inventories. Those in
+    /// `uncompared` were not compared in the class, and neither have the instance nor lack it. `order` is that of the first
+    /// inventory. The differences and the order must outlive this.
+    TInstanceVotes(const std::vector<TDifference>& differences, std::size_t inventories, const std::vector<std::size_t>& uncompared,
+                   TPropertyOrder& order);
 
     /// The differences from the majority, in the order of IDifferences, with the positions that TMajorityView gives.
     std::vector<TDifference> Differ() const;
@@ -41,11 +41,10 @@ class TInstanceVotes {
     TDifference Start(TDifference::EKind kind, std::vector<std::size_t> inventories) const;
     TDifference Missing() const;
     TDifference Extra() const;
-    void AddWinner(std::vector<std::pair<std::string, TCIMValue>>& contents, const TProperty& property) const;
     TDifference Changed(const TProperty& property) const;
 
     const std::vector<TDifference>& fDifferences;
-    const std::vector<TInventory>& fInventories;
+    TPropertyOrder& fOrder;
     std::vector<EState> fStates;  // of each inventory of the run
     std::vector<TProperty> fProperties;
 };

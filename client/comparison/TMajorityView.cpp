@@ -24,8 +24,9 @@ TMajorityView::TMajorityView(std::shared_ptr<IDifferences> differences, const st
 void TMajorityView::ForEach(const TCallback& callback)
 {
     std::vector<TDifference> ofInstance;
+    TPropertyOrder order(fInventories.front());
     const auto handOn = [&] {
-        for (const TDifference& difference : FromMajority(ofInstance)) {
+        for (const TDifference& difference : FromMajority(ofInstance, order)) {
             callback(difference);
         }
         ofInstance.clear();
@@ -40,14 +41,14 @@ void TMajorityView::ForEach(const TCallback& callback)
     handOn();
 }
 
-std::vector<TDifference> TMajorityView::FromMajority(const std::vector<TDifference>& ofInstance) const
+std::vector<TDifference> TMajorityView::FromMajority(const std::vector<TDifference>& ofInstance, TPropertyOrder& order) const
 {
     if (ofInstance.empty()) {
         return {};
     }
     const auto uncompared = fUncompared.find(ofInstance.front().className);
-    return TInstanceVotes(ofInstance, fInventories,
-                          uncompared == fUncompared.end() ? std::vector<std::size_t>() : uncompared->second)
+    return TInstanceVotes(ofInstance, fInventories.size(),
+                          uncompared == fUncompared.end() ? std::vector<std::size_t>() : uncompared->second, order)
         .Differ();
 }
 

@@ -7,6 +7,7 @@
 
 #include "client/comparison/IDifferences.h"
 #include "client/comparison/TCoverage.h"
+#include "client/comparison/TPropertyOrder.h"
 #include "client/inventory/TInventory.h"
 
 namespace NORVZEL20 {
@@ -39,7 +40,7 @@ class TMajorityView final : public IDifferences {
     void ForEach(const TCallback& callback) override;
 
   private:
-    std::vector<TDifference> FromMajority(const std::vector<TDifference>& ofInstance) const;
+    std::vector<TDifference> FromMajority(const std::vector<TDifference>& ofInstance, TPropertyOrder& order) const;
 
     const std::shared_ptr<IDifferences> fDifferences;
     const std::vector<TInventory>& fInventories;

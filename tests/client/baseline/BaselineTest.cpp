@@ -196,6 +196,26 @@ TEST_F(BaselineTest, WhatANewInventoryHoldsIsShownAsItHoldsIt)
     EXPECT_EQ(alone.substr(0, alone.find('\n')), lines.substr(0, lines.find('\n')));
 }
 
+TEST_F(BaselineTest, ContentsStayInTheOrderOfTheClass)
+{
+    const auto write = [this](const std::string& label, const std::string& instances) {
+        const std::string properties =
+            KeyProperty("Id") + Declaration("Zone", "string") + Declaration("Model", "string") + Declaration("Alias", "string");
+        fSystems[label] = Scratch(label + ".xml", Document(NORVZEL20::System() + Class("Disk", "", properties) + instances));
+    };
+    const std::string disk = Value("Id", "sdc") + Value("Model", "A 1");
+    write("web01", Instance("Disk", Value("Id", "sda")));
+    write("web02", Instance("Disk", Value("Id", "sda")) + Instance("Disk", disk));
+    Accept();
+    write("web03", Instance("Disk", Value("Id", "sda")) + Instance("Disk", disk + Value("Alias", "c") + Value("Zone", "z")));
+    const std::string json = Compare({"--baseline", fBaseline, "-o", "ndjson"});
+    EXPECT_NE(std::string::npos,
+              json.find("\"inventories\":[\"web03\"],\"contents\":{\"Zone\":{\"type\":\"string\",\"value\":\"z\"},"
+                        "\"Model\":{\"type\":\"string\",\"value\":\"A 1\"},"
+                        "\"Alias\":{\"type\":\"string\",\"value\":\"c\"}}"))
+        << json;
+}
+
 TEST_F(BaselineTest, ReasonsAndCommentsStayWithWhatStillHolds)
 {
     System("web02", {{"sda", "2"}, {"sdb", "6"}, {"sdc", "7"}});
