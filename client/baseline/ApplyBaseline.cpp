@@ -9,7 +9,7 @@
 
 namespace NORVZEL20 {
 
-TBaseline ApplyBaseline(TComparisonReport& report, TBaseline baseline, const TBaselineOptions& options)
+std::optional<TBaseline> ApplyBaseline(TComparisonReport& report, TBaseline baseline, const TBaselineOptions& options)
 {
     const auto acceptance = std::make_shared<const TAcceptance>(std::make_shared<const TBaseline>(std::move(baseline)), report);
     const TBaselineReview review(*report.differences, *acceptance);
@@ -17,7 +17,7 @@ TBaseline ApplyBaseline(TComparisonReport& report, TBaseline baseline, const TBa
     report.baseline = review.GetOutcome();
     report.baseline->isAccepting = !options.accept.empty();
     report.baseline->file = report.baseline->isAccepting ? options.accept : options.baseline;
-    return review.Accept(EscapeForDisplay(options.reason));
+    return report.baseline->isAccepting ? std::make_optional(review.Accept(EscapeForDisplay(options.reason))) : std::nullopt;
 }
 
 }  // namespace NORVZEL20

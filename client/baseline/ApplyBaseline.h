@@ -1,5 +1,6 @@
 #pragma once
 
+#include <optional>
 #include <string>
 
 #include "client/baseline/TBaseline.h"
@@ -14,8 +15,9 @@ struct TBaselineOptions {
     std::string reason;    ///< why they are accepted
 };
 
-/// Makes the report one of what `baseline` does not accept. Returns the baseline that accepts everything in the run, with `reason`
-/// for what is new. The report must stay where it is while its differences are read. Errors: those of IDifferences::ForEach.
-TBaseline ApplyBaseline(TComparisonReport& report, TBaseline baseline, const TBaselineOptions& options);
+/// Makes the report one of what `baseline` does not accept. If `options` name a file to accept, returns the baseline that accepts
+/// everything in the run, with `reason` for what is new. The report must stay where it is while its differences are read.
+/// Errors: those of IDifferences::ForEach.
+std::optional<TBaseline> ApplyBaseline(TComparisonReport& report, TBaseline baseline, const TBaselineOptions& options);
 
 }  // namespace NORVZEL20

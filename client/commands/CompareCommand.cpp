@@ -79,7 +79,7 @@ TTextOptions TextOptions(const TCompareOptions& options, const IConsole& console
 
 // What is saved is kept before the report is seen, and after it could be made: if either fails, the report is not seen, and if the
 // report cannot be made, nothing is kept.
-void Deliver(TComparisonReport& report, const TCompareOptions& options, const TBaseline* accepted, IConsole& console)
+void Deliver(TComparisonReport& report, const TCompareOptions& options, const std::optional<TBaseline>& accepted, IConsole& console)
 {
     TResultOutput output(console, options.output);
     const bool isWritten = !options.isQuiet || !IsStandardOutput(options.output);
@@ -90,7 +90,7 @@ void Deliver(TComparisonReport& report, const TCompareOptions& options, const TB
                     [&output](std::string_view piece) { output.Write(piece); });
     }
     SaveRules(options.savedRules, report, options.selection, console);
-    if (accepted != nullptr) {
+    if (accepted) {
         DeliverResult(console, options.baseline.accept, accepted->ToText());
     }
     if (isWritten) {
@@ -132,13 +132,13 @@ int RunCompare(const TCompareOptions& options, IConsole& console)
     if (reference.WantsMajority()) {
         report = SeeFromMajority(report);
     }
+    std::optional<TBaseline> accepted;
     if (baseline) {
-        baseline = ApplyBaseline(report, std::move(*baseline), options.baseline);
+        accepted = ApplyBaseline(report, std::move(*baseline), options.baseline);
     }
     ShowOnly(report, options.only);
-    const bool isAccepting = !options.baseline.accept.empty();
-    Deliver(report, options, isAccepting ? &*baseline : nullptr, console);
-    return isAccepting || report.differences->GetCounts().GetTotal() == 0 ? kExitSuccess : kExitDifferences;
+    Deliver(report, options, accepted, console);
+    return accepted || report.differences->GetCounts().GetTotal() == 0 ? kExitSuccess : kExitDifferences;
 }
 
 }  // namespace NORVZEL20
