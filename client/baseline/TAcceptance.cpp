@@ -14,29 +14,26 @@ bool IsLeftOut(const TCoverage::TClass& cls, const std::string& property)
 
 }  // namespace
 
-std::optional<std::size_t> TAcceptance::FindEntry(const TDifference& difference, const TDifferenceStates& states,
-                                                  std::size_t inventory) const
-{
-    return fBaseline->Find(difference.kind, states.GetInstance(), states.GetProperty(), fReport.labels[inventory]);
-}
-
-TAcceptance::EVerdict TAcceptance::Judge(const TDifference& difference, const TDifferenceStates& states,
+TAcceptance::TVerdict TAcceptance::Judge(const TDifference& difference, const TDifferenceStates& states,
                                          std::size_t inventory) const
 {
-    const std::optional<std::size_t> entry = FindEntry(difference, states, inventory);
-    if (!entry) {
-        return kNew;
+    TVerdict verdict;
+    verdict.entry = fBaseline->Find(difference.kind, states.GetInstance(), states.GetProperty(), fReport.labels[inventory]);
+    if (!verdict.entry) {
+        return verdict;
     }
-    const std::vector<TAcceptedDifference::TValue>& accepted = fBaseline->GetEntries()[*entry].values;
-    const std::vector<TAcceptedDifference::TValue> present = states.ValuesOf(inventory);
-    if (accepted == present) {
-        return kAccepted;
+    const std::vector<TAcceptedDifference::TValue>& accepted = fBaseline->GetEntries()[*verdict.entry].values;
+    verdict.present = states.ValuesOf(inventory);
+    if (accepted == verdict.present) {
+        verdict.isAccepted = true;
+        return verdict;
     }
     const TCoverage::TClass* const cls = FindClass(difference.className);
     std::vector<TAcceptedDifference::TValue> compared;
     std::copy_if(accepted.begin(), accepted.end(), std::back_inserter(compared),
                  [cls](const TAcceptedDifference::TValue& value) { return cls == nullptr || !IsLeftOut(*cls, value.property); });
-    return compared == present ? kAccepted : kDifferent;
+    verdict.isAccepted = compared == verdict.present;
+    return verdict;
 }
 
 bool TAcceptance::IsCompared(const TAcceptedDifference& entry) const

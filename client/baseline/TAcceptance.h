@@ -14,10 +14,10 @@ namespace NORVZEL20 {
 /// What a baseline means for the inventories of a run.
 class TAcceptance {
   public:
-    enum EVerdict {
-        kAccepted,
-        kNew,       ///< nothing is known of it for that inventory
-        kDifferent  ///< the inventory was accepted with another value, or for another value of the reference
+    struct TVerdict {
+        bool isAccepted = false;
+        std::optional<std::size_t> entry;                  ///< for that inventory, whatever its values
+        std::vector<TAcceptedDifference::TValue> present;  ///< what the inventory has, if there is an entry
     };
 
     /// The report must outlive this.
@@ -29,11 +29,8 @@ class TAcceptance {
     const TInventory& GetReference() const { return fReport.inventories->front(); }
     const std::string& LabelOf(std::size_t inventory) const { return fReport.labels[inventory]; }
 
-    /// The entry for one of the inventories of a difference, whatever its values.
-    std::optional<std::size_t> FindEntry(const TDifference& difference, const TDifferenceStates& states,
-                                         std::size_t inventory) const;
     /// Whether the difference is accepted for one of its inventories. Contents that this run does not compare do not count.
-    EVerdict Judge(const TDifference& difference, const TDifferenceStates& states, std::size_t inventory) const;
+    TVerdict Judge(const TDifference& difference, const TDifferenceStates& states, std::size_t inventory) const;
     /// Whether the run compared what the entry is about: if so and there is no such difference, it is gone.
     bool IsCompared(const TAcceptedDifference& entry) const;
     /// Whether one of the other inventories has that label.

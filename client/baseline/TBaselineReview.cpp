@@ -38,17 +38,19 @@ void TBaselineReview::Add(const TDifference& difference)
     std::vector<std::size_t> entries;  // of those in fOutcome.changed that this difference adds
     for (const std::size_t inventory : difference.inventories) {
         const std::string& label = fAcceptance.LabelOf(inventory);
-        const std::optional<std::size_t> entry = fAcceptance.FindEntry(difference, states, inventory);
-        const TAcceptance::EVerdict verdict = fAcceptance.Judge(difference, states, inventory);
-        if (verdict == TAcceptance::kAccepted) {
-            fKept[*entry].push_back(label);
+        TAcceptance::TVerdict verdict = fAcceptance.Judge(difference, states, inventory);
+        if (verdict.isAccepted) {
+            fKept[*verdict.entry].push_back(label);
             continue;
         }
         left.push_back(inventory);
-        TAcceptedDifference present{difference.kind, states.GetInstance(), states.ValuesOf(inventory), {label}};
-        if (entry) {
-            fReplaced[*entry].push_back(label);
-            AddChanged(present, *entry, entries);
+        TAcceptedDifference present{difference.kind,
+                                    states.GetInstance(),
+                                    verdict.entry ? std::move(verdict.present) : states.ValuesOf(inventory),
+                                    {label}};
+        if (verdict.entry) {
+            fReplaced[*verdict.entry].push_back(label);
+            AddChanged(present, *verdict.entry, entries);
         }
         fUnaccepted.Add(std::move(present));
     }

@@ -11,7 +11,7 @@ void TUnacceptedDifferences::ForEach(const TCallback& callback)
         const TDifferenceStates states(difference);
         std::vector<std::size_t> left;
         for (const std::size_t inventory : difference.inventories) {
-            if (fAcceptance->Judge(difference, states, inventory) != TAcceptance::kAccepted) {
+            if (!fAcceptance->Judge(difference, states, inventory).isAccepted) {
                 left.push_back(inventory);
             }
         }
