@@ -4,8 +4,10 @@
 //   + INSTANCE PROPERTY: VALUE, PROPERTY: VALUE in LABEL       an instance that the reference lacks, and what it holds
 //   - INSTANCE in LABEL                                        an instance that only the reference has
 //
-// and may end with "# REASON". INSTANCE is a class and a key as in a path; VALUE is what ValueIdentity writes. Values are compared
-// as texts, so nothing is read from them but where they end: blanks within them count as one, those within quotes as they are.
+// and may end with "# REASON". INSTANCE is a class and a key as in a path; VALUE is what ValueIdentity writes. If the rules exclude
+// keys, several instances of an inventory may share one: then "(instances): 2" stands among the values of +, and " x2" behind a
+// VALUE that so many of them have. Different values have " / " between them. Values are compared as texts, so nothing is read from
+// them but where they end: blanks within them count as one, those within quotes as they are.
 #include "client/baseline/ParseEntry.h"
 
 #include <algorithm>

@@ -216,6 +216,23 @@ TEST_F(BaselineTest, ContentsStayInTheOrderOfTheClass)
         << json;
 }
 
+TEST_F(BaselineTest, InstancesThatShareAKeyAreCounted)
+{
+    const auto disk = [](const char* boot, const char* size) {
+        return Instance("Disk", Value("Id", "sda") + Value("Boot", boot) + Value("Size", size, "uint16"));
+    };
+    const auto write = [this](const std::string& label, const std::string& instances) {
+        const std::string properties = KeyProperty("Id") + KeyProperty("Boot") + Declaration("Size", "uint16");
+        fSystems[label] = Scratch(label + ".xml", Document(NORVZEL20::System() + Class("Disk", "", properties) + instances));
+    };
+    write("web01", "");
+    write("web02", disk("1", "5") + disk("2", "5") + disk("3", "6"));
+    Accept({"--exclude-key", "Boot"});
+    EXPECT_EQ("+ Disk.Id=\"sda\" (instances): 3, Size: uint16 5 x2 / uint16 6 in web02\n", Entries());
+    const std::string since = Since({"--exclude-key", "Boot"});
+    EXPECT_EQ(0u, since.find("Nothing new between web01 and web02 since base.txt: 1 accepted difference")) << since;
+}
+
 TEST_F(BaselineTest, ReasonsAndCommentsStayWithWhatStillHolds)
 {
     System("web02", {{"sda", "2"}, {"sdb", "6"}, {"sdc", "7"}});
