@@ -30,6 +30,7 @@ class TKeptConsole : public IConsole {
     }
     bool IsColored() const override { return false; }
     std::size_t GetWidth() const override { return 0; }
+    bool IsTerminal() const override { return false; }
     void ShowProgress(std::string_view) noexcept override {}
 
     const std::string& GetResult() const { return fResult; }

@@ -28,7 +28,7 @@ class IConsole {
     virtual std::size_t GetWidth() const = 0;
 
     /// Whether results on standard output go to a terminal.
-    virtual bool IsTerminal() const { return false; }
+    virtual bool IsTerminal() const = 0;
 
     /// Replaces the line of progress on standard error, if that is a terminal. An empty text removes the line.
     virtual void ShowProgress(std::string_view text) noexcept = 0;

@@ -34,6 +34,7 @@ class TFixedConsole : public IConsole {
     }
     bool IsColored() const override { return false; }
     std::size_t GetWidth() const override { return 0; }
+    bool IsTerminal() const override { return false; }
     void ShowProgress(std::string_view) noexcept override {}
 
     std::string GetOut() const { return std::string(fOut, fOutLength); }
