@@ -15,6 +15,7 @@
 #include "client/text/Counted.h"
 #include "client/text/DisplayText.h"
 #include "client/text/SomeOf.h"
+#include "embedded/value/TUtf8.h"
 
 namespace NORVZEL20 {
 
@@ -114,17 +115,12 @@ class TBaselineLines {
     const std::string& GetText() const { return fText; }
 
   private:
-    // Not within a character.
     std::string Cut(const std::string& line) const
     {
         if (fOptions.isDetailed || fOptions.width == 0 || line.size() <= fOptions.width) {
             return line;
         }
-        std::size_t end = fOptions.width;
-        while (end > 0 && (static_cast<unsigned char>(line[end]) & 0xC0U) == 0x80U) {
-            --end;
-        }
-        return line.substr(0, end) + "... (--detail)";
+        return std::string(TUtf8::Shorten(line, fOptions.width)) + "... (--detail)";
     }
 
     const TTextOptions& fOptions;
