@@ -24,6 +24,12 @@ std::string Quoted(const std::string& text)
     return quoted + '"';
 }
 
+// `Version: "5.1" -> "5.2"`
+std::string EntryValueText(const TAcceptedDifference::TValue& value)
+{
+    return value.property + ": " + (value.before.empty() ? "" : value.before + " -> ") + value.after;
+}
+
 }  // namespace
 
 std::string FieldText(const std::string& text)
@@ -41,11 +47,6 @@ const char* SignOf(TDifference::EKind kind)
     default:
         return "~";
     }
-}
-
-std::string EntryValueText(const TAcceptedDifference::TValue& value)
-{
-    return value.property + ": " + (value.before.empty() ? "" : value.before + " -> ") + value.after;
 }
 
 std::string EntryText(const TAcceptedDifference& entry)

@@ -16,14 +16,12 @@ namespace NORVZEL20 {
 /// position 0 is the majority, and each inventory of the run has its position plus 1.
 ///
 /// - The majority has an instance if more inventories have it than lack it. If as many do, the first inventory of the run decides.
-/// - Of an instance that it has, each property has the value that most of those inventories have which have the instance. Of
-/// several
-///   such values, it is that of the run's first inventory, or else that of the first inventory with one of them.
-/// - If the rules exclude keys, several instances of an inventory may have one key. Such an inventory counts for a value only if
-/// all
-///   these instances have it; if none does, the first value of the first inventory is taken. Those that have another value than the
-///   majority are differences, as in the run. Of the run's first inventory, only the first instance with the key was compared, so
-///   only that one counts.
+/// - Of an instance that it has, each property has the value that most of those inventories have which have the instance.
+///   Of several such values, it is that of the run's first inventory, or else that of the first inventory with one of them.
+/// - If the rules exclude keys, several instances of an inventory may have one key. Such an inventory counts for a value
+///   only if all these instances have it; if none does, the first value of the first inventory is taken. Those that have
+///   another value than the majority are differences, as in the run. Of the run's first inventory, only the first instance
+///   with the key was compared, so only that one counts.
 ///
 /// An inventory that was not compared in a class does not count there. Values are equal if the run takes them for equal; nulls of
 /// different types are. Threads: one at a time.
