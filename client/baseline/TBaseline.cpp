@@ -12,7 +12,6 @@
 #include <utility>
 
 #include "client/baseline/EntryText.h"
-#include "client/text/DisplayText.h"
 
 namespace NORVZEL20 {
 

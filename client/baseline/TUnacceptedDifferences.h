@@ -1,7 +1,6 @@
 #pragma once
 
 #include <memory>
-#include <vector>
 
 #include "client/baseline/TAcceptance.h"
 #include "client/comparison/IDifferences.h"

@@ -1,7 +1,6 @@
 #include "client/comparison/FindNameHint.h"
 
 #include <algorithm>
-#include <map>
 #include <set>
 #include <string>
 #include <utility>

@@ -1,7 +1,6 @@
 #include "client/comparison/SeeFromMajority.h"
 
 #include <memory>
-#include <utility>
 
 #include "client/comparison/TMajorityView.h"
 #include "client/inventory/TReferenceChoice.h"

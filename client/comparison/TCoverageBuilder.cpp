@@ -12,6 +12,7 @@
 #include "client/comparison/TCoverageBuilder.h"
 
 #include <algorithm>
+#include <set>
 
 #include "client/comparison/DescribeExcludedKeys.h"
 #include "client/inventory/NotCollected.h"

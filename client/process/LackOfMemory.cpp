@@ -11,7 +11,6 @@
 #include <cstdlib>
 #include <exception>
 #include <new>
-#include <string_view>
 
 #include "client/process/ExitStatus.h"
 #include "client/process/WriteWhole.h"
