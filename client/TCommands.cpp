@@ -116,13 +116,19 @@ CLI::App* TCommands::AddCommand(const char* name, const char* description, std::
     return command;
 }
 
+std::vector<std::string> TCommands::AllInventories() const
+{
+    std::vector<std::string> inventories{fReference};
+    inventories.insert(inventories.end(), fOthers.begin(), fOthers.end());
+    return inventories;
+}
+
 void TCommands::AddCompare()
 {
     CLI::App* command =
         AddCommand("compare", "show what differs between a reference and other inventories", [this](IConsole& console) {
-            std::vector<std::string> inventories = fOthers;
-            inventories.insert(inventories.begin(), fReference);
-            TCommandFiles files{inventories, fCompare.rules, fCompare.output, fCompare.baseline.baseline, fCompare.baseline.accept};
+            TCommandFiles files{AllInventories(), fCompare.rules, fCompare.output, fCompare.baseline.baseline,
+                                fCompare.baseline.accept};
             files.savedRules = fCompare.savedRules;
             fCompare.inventories = PrepareFiles(files, fCompare.loading, 2, console);
             return RunCompare(fCompare, console);
@@ -150,9 +156,7 @@ void TCommands::AddNoise()
 {
     CLI::App* command = AddCommand("noise", "find rules that leave out what changes by itself between inventories of one system",
                                    [this](IConsole& console) {
-                                       std::vector<std::string> inventories = fOthers;
-                                       inventories.insert(inventories.begin(), fReference);
-                                       TCommandFiles files{inventories, fNoise.rules, fNoise.output};
+                                       TCommandFiles files{AllInventories(), fNoise.rules, fNoise.output};
                                        files.savedRules = fNoise.savedRules;
                                        fNoise.inventories = PrepareFiles(files, fNoise.loading, 2, console);
                                        return RunNoise(fNoise, console);

@@ -30,6 +30,8 @@ class TCommands {
 
   private:
     CLI::App* AddCommand(const char* name, const char* description, std::function<int(IConsole&)> run);
+    // As the command line has them: the reference in front of the others.
+    std::vector<std::string> AllInventories() const;
     void AddCompare();
     void AddNoise();
     void AddCheck();
