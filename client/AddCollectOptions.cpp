@@ -39,8 +39,10 @@ void AddCollectOptions(CLI::App* command, TCollectOptions& options)
             "be repeated")
         ->allow_extra_args(false)
         ->option_text("PATTERN");
-    command->add_flag("--root-files", options.collection.hasRootFiles,
-                      "read configuration files that not everybody may read too, except those that may hold keys or passwords");
+    command->add_flag(
+        "--root-files", options.collection.hasRootFiles,
+        "read configuration files and tables of jobs that not everybody may read too, except files that may hold keys or\n"
+        "passwords");
 }
 
 }  // namespace NORVZEL20

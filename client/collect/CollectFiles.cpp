@@ -109,9 +109,8 @@ class TConfigurationFiles {
             AddContents(facts, path, status);
         }
         fCollection.Add(facts);
-        const mode_t needed = S_IROTH | S_IXOTH;
-        if (S_ISDIR(status.st_mode) && (status.st_mode & needed) != needed && !fCollection.GetOptions().hasRootFiles) {
-            fCollection.LeaveOut(path, kForRoot, kForRootAdvice);
+        if (S_ISDIR(status.st_mode) && fCollection.IsLeftToRoot(status)) {
+            fCollection.LeaveToRoot(path);
             return false;
         }
         return true;
@@ -119,8 +118,6 @@ class TConfigurationFiles {
 
   private:
     using TNames = std::map<std::string, std::string>;
-    static constexpr char kForRoot[] = "only root may read it";
-    static constexpr char kForRootAdvice[] = "as root, --root-files includes it";
 
     TNames NamesByNumber(const std::string& path, TCollection::TReader reader, const char* number) const
     {
@@ -145,16 +142,15 @@ class TConfigurationFiles {
             return;
         }
         std::string trouble;
-        const bool isForRoot = !HoldsSecrets(path) && (status.st_mode & S_IROTH) == 0 && !fCollection.GetOptions().hasRootFiles;
         if (HoldsSecrets(path)) {
             trouble = kSecretReason;
-        } else if (isForRoot) {
-            trouble = kForRoot;
+        } else if (fCollection.IsLeftToRoot(status)) {
+            fCollection.LeaveToRoot(path);
         } else if (const std::string digest = DigestFile(fCollection.GetRoot(), path, trouble); !digest.empty()) {
             facts.Text("Digest", digest);
         }
         if (!trouble.empty()) {
-            fCollection.LeaveOut(path, trouble, isForRoot ? kForRootAdvice : "");
+            fCollection.LeaveOut(path, trouble);
         }
     }
 

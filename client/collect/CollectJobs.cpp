@@ -2,6 +2,8 @@
 //
 // A job is known by where it stands, what it does and for whom; when it does it is a property. So a job that is moved to another
 // hour shows as one change. The scripts in folders such as /etc/cron.daily are jobs of the line that runs the folder.
+//
+// Commands may hold passwords, so a table that not everybody may read is left out unless --root-files asks for it.
 #include <algorithm>
 #include <map>
 #include <tuple>
@@ -35,10 +37,22 @@ class TScheduledJobs {
     std::map<std::tuple<std::string, std::string, std::string>, std::vector<std::string>> fSchedules;
 };
 
+// Whether a table, or a folder of tables, may be read; one that is left to root is left out.
+bool MayRead(TCollection& collection, const std::string& path)
+{
+    const TDescriptor place = collection.GetRoot().OpenPlace(path);
+    struct stat status;
+    if (place && fstat(place.Get(), &status) == 0 && collection.IsLeftToRoot(status)) {
+        collection.LeaveToRoot(path);
+        return false;
+    }
+    return true;
+}
+
 void AddJobs(TCollection& collection, TScheduledJobs& jobs, const std::string& path,
              std::vector<TJob> (*read)(std::string_view, TReadFaults&), const std::string& user = std::string())
 {
-    const std::optional<std::string> text = collection.ReadIfThere(path);
+    const std::optional<std::string> text = MayRead(collection, path) ? collection.ReadIfThere(path) : std::nullopt;
     if (!text) {
         return;
     }
@@ -62,6 +76,9 @@ std::vector<TJob> ReadUserTable(std::string_view text, TReadFaults& faults)
 
 std::vector<TFolderEntry> FilesIn(TCollection& collection, const std::string& folder, bool hasDots = false)
 {
+    if (!MayRead(collection, folder)) {
+        return {};
+    }
     std::string trouble;
     std::vector<TFolderEntry> entries = collection.GetRoot().List(folder, trouble);
     if (!trouble.empty()) {

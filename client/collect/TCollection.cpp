@@ -21,6 +21,17 @@ bool TCollection::IsExcluded(const std::string& path) const
                        [&path](const std::string& pattern) { return fnmatch(pattern.c_str(), path.c_str(), 0) == 0; });
 }
 
+bool TCollection::IsLeftToRoot(const struct stat& status) const
+{
+    const mode_t needed = S_ISDIR(status.st_mode) ? S_IROTH | S_IXOTH : S_IROTH;
+    return (status.st_mode & needed) != needed && !fOptions.hasRootFiles;
+}
+
+void TCollection::LeaveToRoot(const std::string& path)
+{
+    LeaveOut(path, "only root may read it", "as root, --root-files includes it");
+}
+
 void TCollection::CheckTime() const
 {
     if (fCalls.Tick() > fEnd) {

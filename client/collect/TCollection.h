@@ -1,5 +1,7 @@
 #pragma once
 
+#include <sys/stat.h>
+
 #include <cstddef>
 #include <optional>
 #include <string>
@@ -33,6 +35,11 @@ class TCollection {
 
     /// Whether the options exclude files of that path.
     bool IsExcluded(const std::string& path) const;
+
+    /// Whether a file or folder is left to root: not everybody may read it, and the options do not ask for such ones. It does not
+    /// depend on who collects, so the inventories of root and of another user meet.
+    bool IsLeftToRoot(const struct stat& status) const;
+    void LeaveToRoot(const std::string& path);
 
     /// What is left out from now on belongs to this kind.
     void BeginKind(const std::string& kind) { fKind = kind; }

@@ -132,6 +132,25 @@ TEST_F(BadSystemsTest, FilesForRootAreReadIfAskedFor)
     EXPECT_NE(std::string::npos, Show("KALMO_ConfigurationFile", options).find("/etc/app/x.conf"));
 }
 
+TEST_F(BadSystemsTest, TablesOfJobsForRootAreReadIfAskedFor)
+{
+    fSystem->File("/etc/cron.d/backup", "@daily root dump --password=hunter2\n", 0600);
+    fSystem->File("/etc/anacrontab", "1 5 x dump --password=hunter2\n", 0640);
+    fSystem->File("/etc/tables/link", "@daily root dump --password=hunter2\n", 0600).Link("/etc/cron.d/linked", "/etc/tables/link");
+    fSystem->File("/var/spool/cron/crontabs/web", "@daily dump --password=hunter2\n");
+    ASSERT_EQ(0, chmod(fSystem->Place("/var/spool/cron/crontabs").c_str(), 0730));
+    EXPECT_EQ("/etc/anacrontab, /etc/cron.d/backup, /etc/cron.d/linked, /var/spool/cron/crontabs: only root may read it (as root, "
+              "--root-files includes it)\n",
+              LinesAbout("jobs"));
+    EXPECT_EQ(std::string::npos, Show("KALMO_ScheduledJob").find("hunter2"));
+    TCollectionOptions options;
+    options.hasRootFiles = true;
+    EXPECT_EQ("", LinesAbout("jobs", options));
+    const std::string jobs = Show("KALMO_ScheduledJob", options);
+    EXPECT_NE(std::string::npos, jobs.find("Source: /etc/cron.d/backup\n    Command: dump --password=hunter2\n")) << jobs;
+    EXPECT_NE(std::string::npos, jobs.find("Source: /var/spool/cron/crontabs/web\n")) << jobs;
+}
+
 TEST_F(BadSystemsTest, LimitOfTimeEndsWhatIsLeft)
 {
     TCollectionOptions options;
