@@ -1,6 +1,9 @@
 #include "client/collect/DigestFile.h"
 
+#include <openssl/err.h>
 #include <openssl/evp.h>
+#include <openssl/pkcs12.h>
+#include <openssl/x509.h>
 #include <unistd.h>
 
 #include <algorithm>
@@ -16,8 +19,33 @@ namespace NORVZEL20 {
 
 namespace {
 
-constexpr std::string_view kPrivateKey = "PRIVATE KEY-----";
+// What stands in a file that holds a private key or a shared one: of PEM, PGP, PuTTY, OpenVPN and WireGuard.
+constexpr std::array<std::string_view, 9> kKeyMarks = {
+    "PRIVATE KEY-----", "PRIVATE KEY BLOCK-----", "PuTTY-User-Key-File", "OpenVPN Static key", "PrivateKey=",
+    "PrivateKey =",     "PresharedKey=",          "PresharedKey =",      "PreSharedKey=",
+};
+constexpr std::size_t kMostMarkBytes = 32;
 constexpr std::size_t kDigestedAtOnce = 64U << 10U;
+
+// Parses `bytes` as DER with `parse`, and frees what it makes.
+template <class T>
+bool Parses(T* (*parse)(T**, const unsigned char**, long), void (*release)(T*), std::string_view bytes)
+{
+    const auto* at = reinterpret_cast<const unsigned char*>(bytes.data());
+    T* const object = parse(nullptr, &at, static_cast<long>(bytes.size()));
+    release(object);
+    ERR_clear_error();
+    return object != nullptr;
+}
+
+// Whether the bytes begin with a private key without words around it: encrypted, in a container, or plain.
+bool BeginsWithKey(std::string_view bytes)
+{
+    constexpr char kSequence = 0x30;
+    return !bytes.empty() && bytes.front() == kSequence &&
+           (Parses<X509_SIG>(&d2i_X509_SIG, &X509_SIG_free, bytes) || Parses<PKCS12>(&d2i_PKCS12, &PKCS12_free, bytes) ||
+            Parses<EVP_PKEY>(&d2i_AutoPrivateKey, &EVP_PKEY_free, bytes));
+}
 
 struct TEndDigest {
     void operator()(EVP_MD_CTX* context) const { EVP_MD_CTX_free(context); }
@@ -36,13 +64,17 @@ class TDigest {
     void Add(std::string_view piece)
     {
         EVP_DigestUpdate(fContext.get(), piece.data(), piece.size());
+        if (fBegin.size() < kDigestedAtOnce) {
+            fBegin += piece.substr(0, kDigestedAtOnce - fBegin.size());
+        }
         // The words may lie across two pieces.
         fEnd += piece;
-        fHasKey |= fEnd.find(kPrivateKey) != std::string::npos;
-        fEnd.erase(0, fEnd.size() - std::min(fEnd.size(), kPrivateKey.size() - 1));
+        fHasKey |= std::any_of(kKeyMarks.begin(), kKeyMarks.end(),
+                               [this](std::string_view mark) { return fEnd.find(mark) != std::string::npos; });
+        fEnd.erase(0, fEnd.size() - std::min(fEnd.size(), kMostMarkBytes));
     }
 
-    bool HasKey() const noexcept { return fHasKey; }
+    bool HasKey() const { return fHasKey || BeginsWithKey(fBegin); }
 
     std::string GetText()
     {
@@ -56,6 +88,7 @@ class TDigest {
 
   private:
     std::unique_ptr<EVP_MD_CTX, TEndDigest> fContext;
+    std::string fBegin;
     std::string fEnd;
     bool fHasKey = false;
 };
