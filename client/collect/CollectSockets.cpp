@@ -1,8 +1,18 @@
 // Sockets that wait for connections or packets, and the programs that have them.
 //
 // The kernel lists sockets with the number of their inode; the descriptors of a process are links that name the same number. Only
-// root may look at the descriptors of others. A UDP socket with a port from the range of those that the kernel hands out is one
-// that a program opened to ask something, not to serve, so it is left out.
+// root may look at the descriptors of others.
+//
+// The kernel hands out ports of a range to programs that ask for any port, so a port of that range may be another one after each
+// start. It also may be configured, as those of tunnels and databases often are. A socket in the range is taken for configured if
+//
+// - it is bound to one address, not to all of them,
+// - its port is open by IPv4 and by IPv6, which no chance does,
+// - its port is one that the kernel was told not to hand out, or
+// - the kernel itself has it.
+//
+// The others are left out, and the inventory says so.
+#include <algorithm>
 #include <map>
 #include <set>
 #include <tuple>
@@ -17,6 +27,10 @@ namespace {
 
 using TProgramNames = std::map<std::uint64_t, std::set<std::string>>;  // by inode
 constexpr std::uint64_t kNoInode = 0;                                  // the kernel's own socket, such as that of a tunnel
+
+// What the kernel has if nobody sets it.
+constexpr std::uint64_t kFirstHandedOut = 32768;
+constexpr std::uint64_t kLastHandedOut = 60999;
 
 using TSocketKey = std::tuple<std::string, std::string, std::uint16_t>;
 
@@ -56,35 +70,75 @@ void FindPrograms(TCollection& collection, TProgramNames& programs)
     }
 }
 
-// What the kernel has if nobody sets it.
-constexpr std::uint64_t kFirstHandedOut = 32768;
-constexpr std::uint64_t kLastHandedOut = 60999;
+// Which ports the kernel hands out.
+class THandedOutPorts {
+  public:
+    explicit THandedOutPorts(const TCollection& collection)
+    {
+        const std::string range = collection.ReadValue("/proc/sys/net/ipv4/ip_local_port_range");
+        const std::vector<std::string_view> numbers = SplitAtBlanks(range);
+        if (numbers.size() == 2) {
+            fFirst = NumberIn(numbers[0]).value_or(kFirstHandedOut);
+            fLast = NumberIn(numbers[1]).value_or(kLastHandedOut);
+        }
+        const std::string reserved = collection.ReadValue("/proc/sys/net/ipv4/ip_local_reserved_ports");
+        for (const std::string_view part : SplitAt(reserved, ',')) {
+            const std::size_t dash = part.find('-');
+            const std::uint64_t first = NumberIn(part.substr(0, dash)).value_or(0);
+            fReserved.emplace_back(first, dash == std::string_view::npos ? first : NumberIn(part.substr(dash + 1)).value_or(first));
+        }
+    }
 
-std::pair<std::uint64_t, std::uint64_t> HandedOutPorts(const TCollection& collection)
+    bool Has(std::uint64_t port) const
+    {
+        return port >= fFirst && port <= fLast && std::none_of(fReserved.begin(), fReserved.end(), [port](const auto& range) {
+                   return port >= range.first && port <= range.second;
+               });
+    }
+
+    std::string GetText() const { return std::to_string(fFirst) + " to " + std::to_string(fLast); }
+
+  private:
+    std::uint64_t fFirst = kFirstHandedOut;
+    std::uint64_t fLast = kLastHandedOut;
+    std::vector<std::pair<std::uint64_t, std::uint64_t>> fReserved;  // first and last
+};
+
+// Leaves out the sockets whose ports may be chance.
+void DropChance(TCollection& collection, std::vector<std::pair<std::string, TSocket>>& sockets)
 {
-    const std::string text = collection.ReadValue("/proc/sys/net/ipv4/ip_local_port_range");
-    const std::vector<std::string_view> numbers = SplitAtBlanks(text);
-    const std::optional<std::uint64_t> first = numbers.size() == 2 ? NumberIn(numbers[0]) : std::nullopt;
-    const std::optional<std::uint64_t> last = numbers.size() == 2 ? NumberIn(numbers[1]) : std::nullopt;
-    return {first.value_or(kFirstHandedOut), last.value_or(kLastHandedOut)};
+    const THandedOutPorts handedOut(collection);
+    std::set<std::pair<std::string, std::uint16_t>> open;
+    for (const auto& [protocol, socket] : sockets) {
+        open.emplace(protocol, socket.port);
+    }
+    const auto isChance = [&](const std::pair<std::string, TSocket>& entry) {
+        const auto& [protocol, socket] = entry;
+        const std::string other = EndsWith(protocol, "6") ? protocol.substr(0, protocol.size() - 1) : protocol + "6";
+        return handedOut.Has(socket.port) && socket.inode != kNoInode && (socket.address == "0.0.0.0" || socket.address == "::") &&
+               open.count({other, socket.port}) == 0;
+    };
+    const auto end = std::remove_if(sockets.begin(), sockets.end(), isChance);
+    if (end != sockets.end()) {
+        collection.LeaveOut("sockets of all addresses with ports from " + handedOut.GetText(),
+                            "the kernel hands out these ports, so they may differ after each start");
+        sockets.erase(end, sockets.end());
+    }
 }
 
 std::vector<std::pair<std::string, TSocket>> ReadAllSockets(TCollection& collection)
 {
-    const std::pair<std::uint64_t, std::uint64_t> handedOut = HandedOutPorts(collection);
     std::vector<std::pair<std::string, TSocket>> sockets;
     for (const std::string protocol : {"tcp", "tcp6", "udp", "udp6"}) {
         const std::string path = "/proc/net/" + protocol;
         const std::optional<std::string> text = collection.ReadIfThere(path);
         TReadFaults faults;
         for (const TSocket& socket : ReadSockets(text.value_or(std::string()), faults)) {
-            const bool isHandedOut = socket.port >= handedOut.first && socket.port <= handedOut.second;
-            if (protocol[0] == 't' || !isHandedOut || socket.inode == kNoInode) {
-                sockets.emplace_back(protocol, socket);
-            }
+            sockets.emplace_back(protocol, socket);
         }
         collection.LeaveOutLines(path, faults);
     }
+    DropChance(collection, sockets);
     return sockets;
 }
 

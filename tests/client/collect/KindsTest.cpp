@@ -137,7 +137,7 @@ TEST_F(KindsTest, SocketsHaveTheirPrograms)
     fSystem->File("/proc/net/tcp", "heading\n 0: 00000000:0016" + peer + "0A" + end + "100 1\n 1: 00000000:0050" + peer + "0A" +
                                        end + "200 1\n" + " 2: 00000000:0050" + peer + "0A" + end + "201 1\n 3: 0100007F:0277" +
                                        peer + "0A" + end + "300 1\n");
-    // The second one is a port that the kernel handed out, the third one the kernel's own.
+    // The second one may be a port that the kernel handed out, the third one is the kernel's own.
     fSystem->File("/proc/net/udp", "heading\n 0: 00000000:0044" + peer + "07" + end + "400 1\n 1: 00000000:9C40" + peer + "07" +
                                        end + "401 1\n" + " 2: 00000000:CA6C" + peer + "07" + end + "0 1\n");
     fSystem->File("/proc/11/comm", "sshd\n").Link("/proc/11/fd/3", "socket:[100]").Link("/proc/11/fd/4", "/dev/null");
@@ -150,6 +150,35 @@ TEST_F(KindsTest, SocketsHaveTheirPrograms)
               "Protocol: udp, Address: 0.0.0.0, Port: 51820, Programs: {}, UserID: 0\n",
               Lines("KALMO_ListeningSocket"));
     EXPECT_NE(std::string::npos, fLines.find("not collected: sockets: tcp 127.0.0.1 port 631: its program cannot be known"))
+        << fLines;
+}
+
+TEST_F(KindsTest, SocketsWithPortsThatMayBeChanceAreLeftOutAndNamed)
+{
+    const auto socket = [](const std::string& address, const std::string& port, const std::string& state) {
+        return " 0: " + address + ":" + port + " 00000000:0000 " + state +
+               " 00000000:00000000 00:00000000 00000000     0        0 9 1\n";
+    };
+    const std::string all6(32, '0');
+    fSystem->File("/proc/sys/net/ipv4/ip_local_port_range", "40000\t50000\n");
+    fSystem->File("/proc/sys/net/ipv4/ip_local_reserved_ports", "45000,46000-46010\n");
+    // 39999, 40000, 50000, 50001, 45000, 46010, and 40000 of one address
+    fSystem->File("/proc/net/tcp", "heading\n" + socket("00000000", "9C3F", "0A") + socket("00000000", "9C40", "0A") +
+                                       socket("00000000", "C350", "0A") + socket("00000000", "C351", "0A") +
+                                       socket("00000000", "AFC8", "0A") + socket("00000000", "B3BA", "0A") +
+                                       socket("0100007F", "9C40", "0A"));
+    fSystem->File("/proc/net/udp", "heading\n" + socket("00000000", "9C41", "07") + socket("00000000", "9C42", "07"));
+    fSystem->File("/proc/net/udp6", "heading\n" + socket(all6, "9C41", "07") + socket(all6, "9C43", "07"));
+    EXPECT_EQ("Protocol: tcp, Address: 0.0.0.0, Port: 39999, UserID: 0\n"
+              "Protocol: tcp, Address: 0.0.0.0, Port: 45000, UserID: 0\n"
+              "Protocol: tcp, Address: 0.0.0.0, Port: 46010, UserID: 0\n"
+              "Protocol: tcp, Address: 0.0.0.0, Port: 50001, UserID: 0\n"
+              "Protocol: tcp, Address: 127.0.0.1, Port: 40000, UserID: 0\n"
+              "Protocol: udp, Address: 0.0.0.0, Port: 40001, UserID: 0\n"
+              "Protocol: udp6, Address: ::, Port: 40001, UserID: 0\n",
+              Lines("KALMO_ListeningSocket"));
+    EXPECT_NE(std::string::npos, fLines.find("sockets of all addresses with ports from 40000 to 50000: the kernel hands out these "
+                                             "ports, so they may differ after each start\n"))
         << fLines;
 }
 
