@@ -4,8 +4,10 @@
 // units.
 //
 // Some services run for a moment whenever something else asks for them: a timer, a path, or a program that calls them by their bus
-// name. Whether one of them runs just now is chance, so it has no state unless it has failed. Units that programs make for a
-// session or a command are left out.
+// name. Whether one of them runs just now is chance, so it has no state unless it has failed.
+//
+// Units that programs make for a session or a command are left out: those with a file for the time of their run, and those without
+// a file that have such a name. A unit with a file of its own stays, whatever its name.
 #include <fnmatch.h>
 
 #include <algorithm>
@@ -22,6 +24,7 @@ namespace {
 
 constexpr int kMostSlices = 8;  // within each other
 
+// Names of units without a file.
 constexpr const char* kPassingUnits[] = {
     "run-*",
     "session-*",
@@ -139,7 +142,7 @@ void CollectUnits(TCollection& collection)
     const TUnitStateSource states(collection);
     const std::set<std::string> onDemand = UnitsOnDemand(files.GetUnits());
     for (const auto& [name, unit] : files.GetUnits()) {
-        if (IsPassingUnit(name)) {
+        if (unit.state == TUnit::kTransient) {
             continue;
         }
         TFacts facts("KALMO_Unit");

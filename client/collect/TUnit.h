@@ -9,6 +9,9 @@ namespace NORVZEL20 {
 
 /// A systemd unit, as far as its files say.
 struct TUnit {
+    /// The state of a unit that a program has made for the time of its run.
+    static constexpr char kTransient[] = "transient";
+
     TUnitFile file;
     std::string path;   ///< of the file; empty if there is only a link to a template
     std::string state;  ///< whether it is started with the system, in the words of UnitFileState

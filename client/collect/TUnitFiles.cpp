@@ -33,7 +33,7 @@ constexpr std::array<const char*, 6> kUnitSuffixes = {".service", ".socket", ".t
 std::string StateOfFolder(const std::string& folder)
 {
     if (folder == "/run/systemd/transient") {
-        return "transient";
+        return TUnit::kTransient;
     }
     return StartsWith(folder, "/run/systemd/generator") ? "generated" : std::string();
 }

@@ -73,6 +73,24 @@ TEST_F(UnitsTest, UnitsWithoutAFileAreThoseThatAreLoaded)
     EXPECT_EQ("ssh.service enabled active\nmade.service NULL active\n", States());
 }
 
+TEST_F(UnitsTest, UnitsWithAFileStayWhateverTheirName)
+{
+    Unit("/etc/systemd/system/run-backup.service", "[Service]\n");
+    Unit("/etc/systemd/system/a-b-c-d-e-f.service", "[Service]\n");
+    Unit("/usr/lib/systemd/system/session-clean.timer", "[Timer]\nOnCalendar=daily\n");
+    Unit("/lib/systemd/system/systemd-fsck@.service", "[Service]\n");
+    Unit("/run/systemd/transient/backup.service", "[Service]\n");
+    fSystem->fCalls.fUnits->push_back({"backup.service", "", "active", "running"});
+    fSystem->fCalls.fUnits->push_back({"systemd-fsck@dev-sda1.service", "", "active", "exited"});
+    fSystem->fCalls.fUnits->push_back({"run-backup.service", "", "failed", "failed"});
+    EXPECT_EQ("a-b-c-d-e-f.service static inactive\n"
+              "run-backup.service static failed\n"
+              "session-clean.timer static inactive\n"
+              "ssh.service enabled active\n"
+              "systemd-fsck@.service static NULL\n",
+              States());
+}
+
 TEST_F(UnitsTest, WithoutAnAnswerServicesWithProcessesAreActive)
 {
     fSystem->fCalls.fUnits.reset();
