@@ -26,6 +26,8 @@ constexpr TCollectedKind kCollectedKinds[] = {
     {"files", &CollectFiles},       {"certificates", &CollectCertificates},
 };
 
+constexpr char kExcludedKind[] = "files";  // to which patterns of excluded files belong
+
 bool IsNamed(const std::vector<std::string>& names, const char* name)
 {
     return std::find(names.begin(), names.end(), name) != names.end();
@@ -64,6 +66,10 @@ std::vector<std::string> CollectInventory(const TSystemRoot& root, ISystemCalls&
 {
     TInventoryWriter writer(sink);
     TCollection collection(root, calls, options, writer);
+    for (const std::string& pattern : options.excluded) {
+        collection.BeginKind(kExcludedKind);
+        collection.LeaveOut(pattern, "excluded by an option");
+    }
     for (const TCollectedKind& kind : kCollectedKinds) {
         collection.BeginKind(kind.name);
         CollectKind(collection, kind);

@@ -110,13 +110,14 @@ TEST_F(BadSystemsTest, FileSystemsOfOtherSystemsAreNotEntered)
     EXPECT_EQ(std::string::npos, Show("KALMO_ConfigurationFile").find("/etc/shared"));
 }
 
-TEST_F(BadSystemsTest, ExcludedFilesAreLeftOutWithoutAWord)
+TEST_F(BadSystemsTest, ExcludedFilesAreNamedByTheirPatterns)
 {
     TCollectionOptions options;
     options.excluded = {"/etc/ssh*", "*/shadow"};
     const std::string text = Show("KALMO_ConfigurationFile", options);
     EXPECT_EQ(std::string::npos, text.find("/etc/ssh"));
-    EXPECT_EQ("", fLines);
+    EXPECT_EQ("not collected: files: /etc/ssh*, */shadow: excluded by an option\n", fLines);
+    EXPECT_NE(std::string::npos, Show("KALMO_NotCollected", options).find("Subjects: {\"/etc/ssh*\", \"*/shadow\"}")) << fLines;
 }
 
 TEST_F(BadSystemsTest, FilesForRootAreReadIfAskedFor)
