@@ -1,7 +1,9 @@
 // Modules of the kernel, and the parameters of /proc/sys.
 //
 // Some files of /proc/sys are no settings: they count, they are made anew at each read, the kernel changes them, or they are
-// secrets. They are never read. Files that can only be written are commands and are passed over without a word.
+// secrets. They are never read. The parameters of an interface that the kernel makes, such as that of a container, are left out,
+// because there are hundreds of each; those of adapters, bonds and VLANs, of "all", of "default" and of lo stay. Files that can
+// only be written are commands and are passed over without a word.
 #include <fnmatch.h>
 
 #include <algorithm>
@@ -27,6 +29,7 @@ constexpr const char* kNoSettings[] = {
     "fs/inode-state",
     "fs/quota/*",
     "kernel/hostname",
+    "kernel/hung_task_detect_count",
     "kernel/ns_last_pid",
     "kernel/perf_event_max_sample_rate",
     "kernel/pty/nr",
@@ -35,6 +38,7 @@ constexpr const char* kNoSettings[] = {
     "kernel/random/uuid",
     "kernel/random/urandom_min_reseed_secs",
     "kernel/sched_domain/*",
+    "net/core/netdev_rss_key",
     "net/netfilter/nf_conntrack_count",
     "vm/stat_refresh",
     "net/ipv*/conf/*/stable_secret",
@@ -51,6 +55,21 @@ bool IsSetting(const std::string& name)
 {
     return std::none_of(std::begin(kNoSettings), std::end(kNoSettings),
                         [&name](const char* pattern) { return fnmatch(pattern, name.c_str(), 0) == 0; });
+}
+
+// Whether it is a folder such as net/ipv4/conf/veth12, of an interface that is no adapter, bond or VLAN.
+bool IsOfMadeInterface(const TSystemRoot& root, const std::string& name)
+{
+    if (fnmatch("net/ipv[46]/conf/*", name.c_str(), FNM_PATHNAME) != 0 &&
+        fnmatch("net/ipv[46]/neigh/*", name.c_str(), FNM_PATHNAME) != 0) {
+        return false;
+    }
+    const std::string interface = name.substr(name.rfind('/') + 1);
+    const bool isOfAll = interface == "all" || interface == "default" || interface == "lo";
+    const std::string folder = "/sys/class/net/" + interface;
+    const bool isSetUp = root.Look(folder + "/device") || root.Look(folder + "/bonding") ||
+                         root.Read(folder + "/uevent").text.find("DEVTYPE=vlan\n") != std::string::npos;
+    return !isOfAll && !isSetUp && root.Look("/sys/class/net");
 }
 
 bool CanBeRead(const TSystemRoot& root, const std::string& path)
@@ -96,7 +115,7 @@ void AddParameters(TCollection& collection, const std::string& folder, int depth
     std::string trouble;
     for (const TFolderEntry& entry : collection.GetRoot().List(kParameterFolder + ("/" + folder), trouble)) {
         const std::string name = folder + entry.name;
-        if (!IsSetting(name)) {
+        if (!IsSetting(name) || (entry.kind == TFolderEntry::EKind::kFolder && IsOfMadeInterface(collection.GetRoot(), name))) {
             continue;
         }
         if (entry.kind == TFolderEntry::EKind::kFolder && depth < kMostParameterFolders) {

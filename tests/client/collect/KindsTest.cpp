@@ -104,7 +104,9 @@ TEST_F(KindsTest, CountersAndSecretsOfTheKernelAreNotRead)
 {
     fSystem->File("/proc/sys/fs/file-nr", "1 2 3\n").File("/proc/sys/net/ipv6/conf/all/stable_secret", "secret\n");
     fSystem->File("/proc/sys/net/ipv4/route/flush", "", 0200).File("/proc/sys/net/ipv4/tcp_rmem", "4096\t131072\t6291456\n");
+    fSystem->File("/proc/sys/net/core/netdev_rss_key", "1:2\n").File("/proc/sys/kernel/hung_task_detect_count", "1\n");
     fSystem->File("/proc/sys/net/ipv4/conf/eth0.5/forwarding", "1\n").File("/proc/sys/kernel/empty", "\n");
+    fSystem->File("/sys/class/net/eth0.5/uevent", "DEVTYPE=vlan\nINTERFACE=eth0.5\n");
     fSystem->File("/proc/modules", "loop 40960 0 - Live 0x0\n").File("/sys/module/loop/parameters/max_loop", "8\n");
     EXPECT_EQ("Name: kernel.empty, Value: \"\"\n"
               "Name: kernel.osrelease, Value: 6.1.0-25-amd64\n"
@@ -113,6 +115,26 @@ TEST_F(KindsTest, CountersAndSecretsOfTheKernelAreNotRead)
               "Name: net.ipv4.tcp_rmem, Value: 4096 131072 6291456\n",
               Lines("KALMO_KernelParameter"));
     EXPECT_EQ("Name: loop, Size: 40960, State: Live, UsedBy: {}, Parameters: {\"max_loop=8\"}\n", Lines("KALMO_KernelModule"));
+}
+
+TEST_F(KindsTest, ParametersOfMadeInterfacesAreLeftOut)
+{
+    for (const std::string interface : {"all", "default", "lo", "eth0", "veth1", "bond0"}) {
+        fSystem->File("/proc/sys/net/ipv4/conf/" + interface + "/forwarding", "1\n");
+        fSystem->File("/proc/sys/net/ipv6/neigh/" + interface + "/locktime", "1\n");
+        fSystem->File("/sys/class/net/" + interface + "/mtu", "1500\n");
+    }
+    fSystem->File("/sys/class/net/eth0/device/vendor", "").File("/sys/class/net/bond0/bonding/mode", "802.3ad 4\n");
+    std::string names;
+    for (const std::string_view line : SplitAt(Lines("KALMO_KernelParameter"), '\n')) {
+        names += StartsWith(line, "Name: net.ip") ? std::string(line.substr(6, line.find(',') - 6)) + "\n" : "";
+    }
+    EXPECT_EQ("net.ipv4.conf.all.forwarding\nnet.ipv4.conf.bond0.forwarding\nnet.ipv4.conf.default.forwarding\nnet.ipv4.conf.eth0."
+              "forwarding\n"
+              "net.ipv4.conf.lo.forwarding\nnet.ipv4.ip_forward\nnet.ipv6.neigh.all.locktime\nnet.ipv6.neigh.bond0.locktime\nnet."
+              "ipv6.neigh.default.locktime\n"
+              "net.ipv6.neigh.eth0.locktime\nnet.ipv6.neigh.lo.locktime\n",
+              names);
 }
 
 TEST_F(KindsTest, JobsComeFromTablesScriptsAndUsers)
