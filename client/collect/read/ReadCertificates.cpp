@@ -5,7 +5,8 @@
 //   -----END CERTIFICATE-----
 //
 // Other blocks, private keys among them, are never decoded. A file without such a line is taken for DER if it begins as a
-// certificate does. Several certificates of one subject in a file are counted, so each has its own key.
+// certificate does. The certificates in a file are counted, so a renewed one, or one of another name, is a change of the one
+// before.
 #include "client/collect/read/ReadCertificates.h"
 
 #include <arpa/inet.h>
@@ -19,7 +20,6 @@
 #include <boost/algorithm/hex.hpp>
 #include <ctime>
 #include <iterator>
-#include <map>
 #include <memory>
 #include <new>
 #include <optional>
@@ -114,12 +114,12 @@ void AddTime(TFacts& facts, const char* property, const ASN1_TIME* time)
     }
 }
 
-TFacts FactsOf(const X509& certificate, const std::string& path, const std::string& subject, std::uint16_t number)
+TFacts FactsOf(const X509& certificate, const std::string& path, std::uint16_t number)
 {
     TFacts facts("KALMO_Certificate");
     facts.Key("Path", path)
-        .Key("Subject", subject)
         .Number("Number", number)
+        .Text("Subject", TextOf(X509_get_subject_name(&certificate)))
         .Text("Issuer", TextOf(X509_get_issuer_name(&certificate)))
         .Text("SerialNumber", SerialOf(certificate))
         .Text("Fingerprint", FingerprintOf(certificate))
@@ -171,9 +171,8 @@ class TCertificateList {
 
     void Add(const X509& certificate)
     {
-        const std::string subject = TextOf(X509_get_subject_name(&certificate));
-        if (const std::uint16_t number = ++fNumbers[subject]; number > 0) {
-            fFacts.push_back(FactsOf(certificate, fPath, subject, number));
+        if (fNumber < UINT16_MAX) {
+            fFacts.push_back(FactsOf(certificate, fPath, ++fNumber));
         }
     }
 
@@ -181,7 +180,7 @@ class TCertificateList {
 
   private:
     const std::string& fPath;
-    std::map<std::string, std::uint16_t> fNumbers;
+    std::uint16_t fNumber = 0;
     std::vector<TFacts> fFacts;
 };
 
