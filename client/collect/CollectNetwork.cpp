@@ -27,8 +27,10 @@ void AddAdapter(TCollection& collection, const std::string& name)
 {
     const std::string folder = "/sys/class/net/" + name + "/";
     TFacts facts("KALMO_NetworkAdapter");
+    // Other addresses are random, or were chosen by somebody.
+    const bool isPermanent = collection.ReadValue(folder + "addr_assign_type") == "0";
     facts.Key("DeviceID", name)
-        .Text("PermanentAddress", collection.ReadValue(folder + "address"))
+        .Text("PermanentAddress", isPermanent ? collection.ReadValue(folder + "address") : std::string())
         .Text("OperationalState", collection.ReadValue(folder + "operstate"))
         .Text("Master", LastPart(collection.GetRoot().ReadLink(folder + "master")))
         .Text("Driver", LastPart(collection.GetRoot().ReadLink(folder + "device/driver")));

@@ -81,7 +81,11 @@ TEST_F(KindsTest, AdaptersHaveAddressesAndRoutes)
     fSystem->File(eth0 + "speed", "10000\n")
         .File(eth0 + "duplex", "full\n")
         .Link(eth0 + "device/driver", "../../../bus/pci/drivers/virtio");
-    fSystem->Link(eth0 + "master", "../br0").File("/sys/class/net/lo/speed", "-1\n").File("/sys/class/net/bonding_masters", "\n");
+    fSystem->File(eth0 + "addr_assign_type", "0\n").File("/sys/class/net/lo/address", "02:00:00:00:00:01\n");
+    fSystem->File("/sys/class/net/lo/addr_assign_type", "1\n")
+        .Link(eth0 + "master", "../br0")
+        .File("/sys/class/net/lo/speed", "-1\n")
+        .File("/sys/class/net/bonding_masters", "\n");
     fSystem->fCalls.fAddresses = {{"eth0", "192.0.2.9/24"}, {"lo", "127.0.0.1/8"}, {"eth0", "192.0.2.7/24"}};
     fSystem->File("/proc/net/if_inet6", "20010db8000000000000000000000005 02 40 00 80     eth0\n");
     fSystem->File(
