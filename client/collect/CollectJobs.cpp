@@ -106,6 +106,10 @@ void AddTimers(TCollection& collection, TScheduledJobs& jobs)
 {
     const TUnitFiles units(collection);
     for (const auto& [name, unit] : units.GetUnits()) {
+        // A template is no timer. Only one that is started with the system asks for its unit.
+        if (name.find("@.") != std::string::npos || unit.state == "disabled" || StartsWith(unit.state, "masked")) {
+            continue;
+        }
         for (const std::string& schedule : unit.file.schedules) {
             jobs.Add(name, {schedule, std::string(), unit.Activated(name)});
         }

@@ -114,9 +114,11 @@ TEST_F(UnitsTest, WithoutSystemdNoStateIsKnown)
     EXPECT_NE(std::string::npos, fLines.find("units: the states of units: systemd does not run\n")) << fLines;
 }
 
-TEST_F(UnitsTest, TimersAreJobs)
+TEST_F(UnitsTest, TimersThatAreStartedAreJobs)
 {
     Unit("/usr/lib/systemd/system/tidy.timer", "[Timer]\nOnCalendar=daily\nOnBootSec=5min\n");
+    Unit("/usr/lib/systemd/system/off.timer", "[Timer]\nOnCalendar=daily\n[Install]\nWantedBy=timers.target\n");
+    Unit("/usr/lib/systemd/system/x@.timer", "[Timer]\nOnCalendar=daily\n");
     EXPECT_EQ("KALMO_ScheduledJob.Command=\"run-parts /etc/cron.hourly\",Source=\"/etc/crontab\",User=\"root\"\n"
               "    Source: /etc/crontab\n"
               "    Command: run-parts /etc/cron.hourly\n"
