@@ -36,8 +36,14 @@ void RequireKinds(const std::vector<std::string>& names)
 
 void CheckCollect(const TCollectOptions& options)
 {
-    RequireKinds(options.collection.only);
+    const std::vector<std::string>& only = options.collection.only;
+    RequireKinds(only);
     RequireKinds(options.collection.skipped);
+    for (const std::string& name : options.collection.skipped) {
+        if (std::find(only.begin(), only.end(), name) != only.end()) {
+            throw TClientError("found " + name + " in --only and in --skip, expected it in one of them; leave out the other");
+        }
+    }
     CheckOutput(options.output, {});
 }
 

@@ -52,6 +52,8 @@ TEST_F(CollectCommandTest, WrongOptionsAreRefusedBeforeAnythingIsRead)
          "cimdelta: zzzzzz is no kind of thing that is collected; name one: system, processors, memory, disks, mounts, network, "
          "packages, "
          "units, kernel, users, jobs, sockets, files or certificates\n"},
+        {{"collect", "--only", "users,jobs", "--skip", "system,users"},
+         "cimdelta: found users in --only and in --skip, expected it in one of them; leave out the other\n"},
         {{"collect", "-o", none.c_str()}, "cimdelta: " + none + ": cannot be written: No such file or directory\n"},
         {{"collect", "web01.xml"}, "cimdelta: web01.xml is one argument too many; see cimdelta collect --help\n"},
         {{"collect", "--only", ""}, "cimdelta: --only: must not be empty; see cimdelta collect --help\n"},
