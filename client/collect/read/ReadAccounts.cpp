@@ -30,7 +30,8 @@ void ForEachAccount(std::string_view text, std::size_t count, TReadFaults& fault
         }
         const TAccountFields fields = SplitAt(line, ':');
         if (fields.size() != count) {
-            faults.Add(lines.GetNumber(), "found " + std::to_string(fields.size()) + " fields, expected " + std::to_string(count));
+            faults.Add(lines.GetNumber(), "found " + std::to_string(fields.size()) + (fields.size() == 1 ? " field" : " fields") +
+                                              ", expected " + std::to_string(count));
         } else if (fields[0].empty() || !NumberIn(fields[2])) {
             faults.Add(lines.GetNumber(), "found the name " + Quoted(fields[0]) + " with the number " + Quoted(fields[2]) +
                                               ", expected a name and a number");

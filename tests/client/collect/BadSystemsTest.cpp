@@ -80,7 +80,7 @@ TEST_F(BadSystemsTest, TablesThatEndEarlyAreOneLine)
     fSystem->Append("/var/lib/dpkg/status", "Package: vim\nStatus: install ok inst");
     EXPECT_EQ("/var/lib/dpkg/status: line 12: found the end of the file, expected the rest of the line\n", LinesAbout("packages"));
     fSystem->File("/etc/passwd", "a\nb\nc\n");
-    EXPECT_EQ("/etc/passwd: line 1: found 1 fields, expected 7 (2 more of its lines are left out)\n", LinesAbout("users"));
+    EXPECT_EQ("/etc/passwd: line 1: found 1 field, expected 7 (2 more of its lines are left out)\n", LinesAbout("users"));
     fSystem->File("/proc/cpuinfo", "");
     EXPECT_EQ("/proc/cpuinfo: found no processor, expected one\n", LinesAbout("processors"));
 }
