@@ -17,6 +17,17 @@ namespace {
 
 constexpr char kDpkgStatus[] = "/var/lib/dpkg/status";
 
+// Of dpkg, and those of rpm in all forms.
+constexpr const char* kDatabases[] = {
+    kDpkgStatus,
+    "/usr/lib/sysimage/rpm/rpmdb.sqlite",
+    "/usr/lib/sysimage/rpm/Packages",
+    "/usr/lib/sysimage/rpm/Packages.db",
+    "/var/lib/rpm/rpmdb.sqlite",
+    "/var/lib/rpm/Packages",
+    "/var/lib/rpm/Packages.db",
+};
+
 // dpkg writes changes here first, in files whose names are numbers, and takes them into its list later.
 void NotePendingUpdates(TCollection& collection)
 {
@@ -33,12 +44,17 @@ void NotePendingUpdates(TCollection& collection)
 void CollectDpkg(TCollection& collection)
 {
     const std::string path = kDpkgStatus;
-    const std::optional<std::string> text = collection.ReadIfThere(path);
+    // A link that leads nowhere is a database that is missing.
+    const std::optional<std::string> text = collection.GetRoot().Look(path) ? collection.Read(path) : std::nullopt;
     if (!text) {
         return;
     }
     TReadFaults faults;
-    collection.AddAll(ReadDpkgStatus(*text, faults));
+    const std::vector<TFacts> packages = ReadDpkgStatus(*text, faults);
+    if (packages.empty() && faults.GetCount() == 0) {
+        collection.LeaveOut(path, "found no package, expected one");
+    }
+    collection.AddAll(packages);
     collection.LeaveOutLines(path, faults);
     NotePendingUpdates(collection);
 }
@@ -76,8 +92,9 @@ void CollectRpm(TCollection& collection)
 void CollectPackages(TCollection& collection)
 {
     const TSystemRoot& root = collection.GetRoot();
-    if (!root.Look(kDpkgStatus) && !root.Look("/var/lib/rpm") && !root.Look("/usr/lib/sysimage/rpm")) {
-        collection.LeaveOut("the packages", "found no database of dpkg or rpm");
+    const auto isThere = [&root](const char* path) { return root.Look(path).has_value(); };
+    if (std::none_of(std::begin(kDatabases), std::end(kDatabases), isThere)) {
+        collection.LeaveOut("all", "no database of dpkg or rpm was found");
     }
     CollectDpkg(collection);
     CollectRpm(collection);

@@ -63,7 +63,7 @@ TEST_F(BadSystemsTest, EmptySystemSaysWhatItLacks)
               "not collected: memory: /proc/meminfo, /proc/swaps: No such file or directory\n"
               "not collected: mounts: /proc/self/mountinfo: No such file or directory\n"
               "not collected: network: /sys/class/net: found no adapter, expected one\n"
-              "not collected: packages: the packages: found no database of dpkg or rpm\n"
+              "not collected: packages: all: no database of dpkg or rpm was found\n"
               "not collected: processors: /proc/cpuinfo: No such file or directory\n"
               "not collected: sockets: /proc/net: it lists no sockets\n"
               "not collected: units: the states of units: systemd does not run\n"
@@ -83,6 +83,18 @@ TEST_F(BadSystemsTest, TablesThatEndEarlyAreOneLine)
     EXPECT_EQ("/etc/passwd: line 1: found 1 field, expected 7 (2 more of its lines are left out)\n", LinesAbout("users"));
     fSystem->File("/proc/cpuinfo", "");
     EXPECT_EQ("/proc/cpuinfo: found no processor, expected one\n", LinesAbout("processors"));
+}
+
+TEST_F(BadSystemsTest, DatabasesOfPackagesThatAreMissingOrEmptyAreNamed)
+{
+    fSystem->File("/var/lib/dpkg/status", "");
+    EXPECT_EQ("/var/lib/dpkg/status: found no package, expected one\n", LinesAbout("packages"));
+    fSystem->Unlink("/var/lib/dpkg/status");
+    fSystem->Link("/var/lib/dpkg/status", "/gone/status");
+    EXPECT_EQ("/var/lib/dpkg/status: No such file or directory\n", LinesAbout("packages"));
+    fSystem->Unlink("/var/lib/dpkg/status");
+    fSystem->File("/var/lib/rpm/.rpm.lock", "");
+    EXPECT_EQ("all: no database of dpkg or rpm was found\n", LinesAbout("packages"));
 }
 
 TEST_F(BadSystemsTest, DpkgAtWorkIsSaid)
