@@ -34,8 +34,12 @@ bool AddCertificates(TCollection& collection, const std::string& path, const str
         return true;
     }
     TReadFaults faults;
-    collection.AddAll(ReadCertificates(file.text, path, faults));
+    const std::vector<TFacts> certificates = ReadCertificates(file.text, path, faults);
+    collection.AddAll(certificates);
     collection.LeaveOutLines(path, faults);
+    if (certificates.empty() && faults.GetCount() == 0 && (EndsWith(path, ".der") || EndsWith(path, ".cer"))) {
+        collection.LeaveOut(path, "found a file that cannot be read, expected a certificate");
+    }
     return true;
 }
 

@@ -211,13 +211,15 @@ TEST_F(KindsTest, SocketsWithPortsThatMayBeChanceAreLeftOutAndNamed)
 TEST_F(KindsTest, CertificatesAreThoseInFilesThatAreNamedSo)
 {
     fSystem->File("/etc/ssl/certs/broken.pem", "-----BEGIN CERTIFICATE-----\nAAAA\n-----END CERTIFICATE-----\n");
+    fSystem->File("/etc/ssl/certs/cut.der", "\x30\x82\x02").File("/etc/ssl/certs/cut.cer", "").File("/etc/ssl/certs/no.pem", "");
     fSystem->File("/etc/ssl/private/x.pem", "-----BEGIN CERTIFICATE-----\nAAAA\n-----END CERTIFICATE-----\n");
     fSystem->File("/etc/ssl/x.txt", "-----BEGIN CERTIFICATE-----\n").Link("/etc/ssl/certs/l.pem", "broken.pem");
     EXPECT_EQ("\n", Lines("KALMO_Certificate"));
-    EXPECT_NE(
-        std::string::npos,
-        fLines.find("not collected: certificates: /etc/ssl/certs/broken.pem: line 1: found a block that cannot be read, expected a "
-                    "certificate\n"))
+    EXPECT_NE(std::string::npos,
+              fLines.find(
+                  "not collected: certificates: /etc/ssl/certs/cut.cer, /etc/ssl/certs/cut.der: found a file that cannot be read, "
+                  "expected a certificate; /etc/ssl/certs/broken.pem: line 1: found a block that cannot be read, expected a "
+                  "certificate\n"))
         << fLines;
 }
 
