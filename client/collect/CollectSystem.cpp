@@ -49,6 +49,9 @@ TFacts OperatingSystem(TCollection& collection)
     if (!text) {
         text = collection.ReadIfThere("/usr/lib/os-release");
     }
+    if (!text) {
+        collection.LeaveOut("/etc/os-release", "No such file or directory");
+    }
     const std::map<std::string, std::string> release = ReadOsRelease(text.value_or(std::string()));
     const auto value = [&release](const char* name) {
         const auto found = release.find(name);
@@ -60,13 +63,15 @@ TFacts OperatingSystem(TCollection& collection)
         .Text("Caption", value("PRETTY_NAME"))
         .Text("Distribution", value("ID"))
         .Text("Version", value("VERSION_ID"))
-        .Text("KernelRelease", collection.ReadValue("/proc/sys/kernel/osrelease"))
+        .Text("KernelRelease", collection.GetCalls().Release())
         .Text("KernelVersion", collection.ReadValue("/proc/sys/kernel/version"))
         .Text("KernelArguments", collection.ReadValue("/proc/cmdline"))
         .Text("Architecture", collection.GetCalls().Machine())
         .Time("DateTimeOfCollection", collection.GetCalls().Now());
     if (const std::optional<std::uint64_t> seconds = BootTime(collection)) {
         facts.Time("LastBootUpTime", static_cast<std::int64_t>(*seconds));
+    } else {
+        collection.LeaveOut("the time of the last start", "/proc/stat does not say it");
     }
     return facts;
 }

@@ -22,6 +22,8 @@ class ISystemCalls {
     virtual std::chrono::steady_clock::time_point Tick() = 0;
     /// What the kernel calls the machine, such as x86_64.
     virtual std::string Machine() = 0;
+    /// The release of the kernel, such as 6.1.0-25-amd64.
+    virtual std::string Release() = 0;
     /// The IPv4 addresses of all interfaces. Errors: std::system_error.
     virtual std::vector<TInterfaceAddress> Addresses() = 0;
     /// The units that the service manager has loaded; nothing, with the reason in `trouble`, if it cannot be asked.

@@ -30,6 +30,12 @@ std::string TLinuxCalls::Machine()
     return uname(&names) == 0 ? names.machine : std::string();
 }
 
+std::string TLinuxCalls::Release()
+{
+    struct utsname names;
+    return uname(&names) == 0 ? names.release : std::string();
+}
+
 std::vector<TInterfaceAddress> TLinuxCalls::Addresses()
 {
     ifaddrs* list = nullptr;

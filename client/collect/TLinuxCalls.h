@@ -10,6 +10,7 @@ class TLinuxCalls : public ISystemCalls {
     std::int64_t Now() override;
     std::chrono::steady_clock::time_point Tick() override;
     std::string Machine() override;
+    std::string Release() override;
     std::vector<TInterfaceAddress> Addresses() override;
     std::optional<std::vector<TUnitState>> UnitStates(std::string& trouble) override;
 };

@@ -66,9 +66,12 @@ TEST_F(BadSystemsTest, EmptySystemSaysWhatItLacks)
               "not collected: packages: all: no database of dpkg or rpm was found\n"
               "not collected: processors: /proc/cpuinfo: No such file or directory\n"
               "not collected: sockets: /proc/net: it lists no sockets\n"
+              "not collected: system: the time of the last start: /proc/stat does not say it; /etc/os-release: No such file or "
+              "directory\n"
               "not collected: units: the states of units: systemd does not run\n"
               "not collected: users: /etc/passwd, /etc/group: No such file or directory\n",
               lines);
+    EXPECT_NE(std::string::npos, xml.find("<VALUE>6.1.0-25-amd64</VALUE>"));
     EXPECT_TRUE(EndsWith(xml, "</CIM>\n")) << xml.substr(xml.size() - 100);
 }
 

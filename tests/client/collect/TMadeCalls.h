@@ -12,6 +12,7 @@ class TMadeCalls : public ISystemCalls {
     std::int64_t Now() override { return fNow; }
     std::chrono::steady_clock::time_point Tick() override { return fTick += fTickLength; }
     std::string Machine() override { return "x86_64"; }
+    std::string Release() override { return "6.1.0-25-amd64"; }
     std::vector<TInterfaceAddress> Addresses() override
     {
         if (fHasNoAddresses) {
