@@ -1,6 +1,6 @@
 #include "client/baseline/ReadBaseline.h"
 
-#include <unistd.h>
+#include <sys/stat.h>
 
 #include <algorithm>
 #include <utility>
@@ -139,7 +139,15 @@ TBaseline ReadBaseline(const std::string& path)
 
 TBaseline ReadBaselineIfAny(const std::string& path)
 {
-    return access(path.c_str(), F_OK) == 0 ? ReadBaseline(path) : TBaseline();
+    struct stat status;
+    if (stat(path.c_str(), &status) != 0) {
+        return TBaseline();
+    }
+    // What cannot be replaced is not read either: a pipe would be waited for.
+    if (!S_ISREG(status.st_mode)) {
+        throw TClientError(path + ": is no ordinary file; name one that accepted differences can be kept in");
+    }
+    return ReadBaseline(path);
 }
 
 }  // namespace NORVZEL20

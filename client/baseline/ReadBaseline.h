@@ -15,7 +15,7 @@ TBaseline ParseBaseline(std::string_view text, const std::string& file);
 /// The same for a file. Errors: also TClientError if it cannot be read.
 TBaseline ReadBaseline(const std::string& path);
 
-/// The same for a file that need not be there; then it has no entries.
+/// The same for a file that need not be there; then it has no entries. Errors: also TClientError if it is no ordinary file.
 TBaseline ReadBaselineIfAny(const std::string& path);
 
 }  // namespace NORVZEL20

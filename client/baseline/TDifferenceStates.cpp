@@ -3,6 +3,7 @@
 #include "client/baseline/TDifferenceStates.h"
 
 #include <algorithm>
+#include <boost/algorithm/string/join.hpp>
 #include <map>
 
 #include "client/baseline/EntryText.h"
@@ -20,20 +21,22 @@ std::string WithoutNamespace(const std::string& path, const std::string& classNa
     return at == std::string::npos ? path : path.substr(at + 1);
 }
 
-// The values of one inventory, which has several if instances share a key; empty if no group has it.
+// The values of one inventory, which has several if instances share a key; empty if no group has it. The order of the groups
+// depends on the other inventories, so it does not count.
 std::string ValueOf(std::size_t inventory, const TValueDifference& values)
 {
-    std::string text;
+    std::vector<std::string> texts;
     for (const TValueDifference::TGroup& group : values.others) {
         const auto at = std::find(group.inventories.begin(), group.inventories.end(), inventory);
         if (at == group.inventories.end()) {
             continue;
         }
         const std::size_t count = group.CountInstances(static_cast<std::size_t>(at - group.inventories.begin()));
-        text += (text.empty() ? "" : kBetweenValues) + ValueIdentity(group.value, values.reference.IsBag() || group.value.IsBag()) +
-                (count > 1 ? " x" + std::to_string(count) : "");
+        texts.push_back(ValueIdentity(group.value, values.reference.IsBag() || group.value.IsBag()) +
+                        (count > 1 ? " x" + std::to_string(count) : ""));
     }
-    return text;
+    std::sort(texts.begin(), texts.end());
+    return boost::algorithm::join(texts, kBetweenValues);
 }
 
 }  // namespace

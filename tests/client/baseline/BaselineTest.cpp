@@ -231,6 +231,13 @@ TEST_F(BaselineTest, InstancesThatShareAKeyAreCounted)
     EXPECT_EQ("+ Disk.Id=\"sda\" (instances): 3, Size: uint16 5 x2 / uint16 6 in web02\n", Entries());
     const std::string since = Since({"--exclude-key", "Boot"});
     EXPECT_EQ(0u, since.find("Nothing new between web01 and web02 since base.txt: 1 accepted difference")) << since;
+    write("web01", disk("1", "7"));
+    Accept({"--exclude-key", "Boot"});
+    EXPECT_EQ("~ Disk.Id=\"sda\" Size: uint16 7 -> uint16 5 x2 / uint16 6 in web02\n", Entries());
+    // Another inventory whose values come in another order changes nothing about this one.
+    write("web01a", disk("1", "6"));
+    const std::string again = Since({"--exclude-key", "Boot"});
+    EXPECT_NE(std::string::npos, again.find("1 new; 0 accepted")) << again;
 }
 
 TEST_F(BaselineTest, ReasonsAndCommentsStayWithWhatStillHolds)
@@ -332,6 +339,8 @@ TEST_F(BaselineTest, AFileThatCannotBeReadOrWrittenIsRefusedBeforeAnythingElse)
 {
     System("web02", {{"sda", "2"}});
     EXPECT_EQ("cimdelta: base.txt: cannot be opened: No such file or directory\n", Compare({"--baseline", fBaseline}));
+    EXPECT_EQ("cimdelta: /dev/zero: is no ordinary file; name one that accepted differences can be kept in\n",
+              Compare({"--accept", "/dev/zero"}));
     EXPECT_EQ("cimdelta: /no/such/base.txt: cannot be written: No such file or directory\n",
               Compare({"--accept", "/no/such/base.txt"}));
     EXPECT_EQ("cimdelta: " + fSystems["web02"] + ": is one of the files that are read; name another file for the result\n",
