@@ -97,6 +97,20 @@ std::string ElementsChanged(const TCIMValue& from, const TCIMValue& to)
     return boost::algorithm::join(parts, " ");
 }
 
+// The same for each group; empty if that of any group is, or if two of them look alike, since they do not say where elements stand.
+std::vector<std::string> ElementsChangedInAll(const TValueDifference& change)
+{
+    std::vector<std::string> all;
+    std::set<std::string> distinct;
+    for (const TValueDifference::TGroup& group : change.others) {
+        all.push_back(ElementsChanged(change.reference, group.value));
+        if (all.back().empty() || !distinct.insert(all.back()).second) {
+            return {};
+        }
+    }
+    return all;
+}
+
 // The text of a value. If all values are plain ones of one type, they are quoted as this line and lists need it; otherwise
 // TValueTexts has found what tells them apart.
 std::string Shown(const TCIMValue& value, const TValueDifference& change, const std::string& text, const TValueWords* words)
@@ -150,13 +164,15 @@ std::string ChangeText(const TValueDifference& change, const TInventoryNames& na
         const auto [before, after] = style.isWhole ? std::make_pair(reference, other) : CutAround(reference, other);
         return before + kBeforeNewValue + OfGroup(group, after, names, style.isPair);
     }
+    const std::vector<std::string> elements = ElementsChangedInAll(change);
     std::vector<std::string> groups;
     for (const std::size_t i : Choose(change.others, style.mostValues)) {
-        const std::string text = Shown(change.others[i].value, change, texts.GetOther(i), style.words);
+        const std::string text =
+            elements.empty() ? Shown(change.others[i].value, change, texts.GetOther(i), style.words) : elements[i];
         groups.push_back(OfGroup(change.others[i], text, names, style.isPair));
     }
     const std::size_t rest = change.others.size() - groups.size();
-    return reference + kBeforeNewValue + boost::algorithm::join(groups, kBetweenValues) +
+    return (elements.empty() ? reference + kBeforeNewValue : std::string()) + boost::algorithm::join(groups, kBetweenValues) +
            (rest > 0 ? "   ... " + Counted(rest, "more value", "more values") + " (--detail)" : std::string());
 }
 

@@ -193,6 +193,34 @@ TEST_F(GroupedReportTest, WhatCameAndWentIsQuotedIfItCouldBeMistaken)
               Findings());
 }
 
+TEST_F(GroupedReportTest, WhatCameAndWentIsShownForEachInventory)
+{
+    System("a", Mount("/", {"rw", "noexec"}));
+    System("b", Mount("/", {"rw"}));
+    System("c", Mount("/", {"rw", "noexec", "nodev"}));
+    EXPECT_EQ("Mount  ~1   /.Options: -noexec (b) / +nodev (c)\n", Findings());
+    fSystems.pop_back();
+    System("d", Mount("/", {"ro"}));
+    EXPECT_EQ("Mount  ~1   /.Options: {rw, noexec} -> {rw} (b) / {ro} (d)\n", Findings());
+}
+
+TEST_F(GroupedReportTest, WhatCameAndWentIsNotShownIfItWouldLookAlike)
+{
+    const std::string declared =
+        "<QUALIFIER.DECLARATION NAME=\"ArrayType\" TYPE=\"string\"><SCOPE PROPERTY=\"true\"/></QUALIFIER.DECLARATION>";
+    const auto ordered = [&](const std::string& name, const std::vector<std::string>& options) {
+        const std::string type = "<QUALIFIER NAME=\"ArrayType\" TYPE=\"string\"><VALUE>Ordered</VALUE></QUALIFIER>";
+        const std::string property = "<PROPERTY.ARRAY NAME=\"Options\" TYPE=\"string\">" + type + "</PROPERTY.ARRAY>";
+        Write(name + ".xml", Document(declared + NORVZEL20::System() + Class("Path", "", KeyProperty("Name") + property) +
+                                      Instance("Path", Value("Name", "p") + List("Options", options))));
+        fSystems.push_back(name + ".xml");
+    };
+    ordered("a", {"b", "c"});
+    ordered("d", {"b", "c", "e"});
+    ordered("f", {"e", "b", "c"});
+    EXPECT_EQ("Path  ~1   p.Options: {b, c} -> {b, c, e} (d) / {e, b, c} (f)\n", Findings());
+}
+
 TEST_F(GroupedReportTest, NamesAndValuesAreQuotedIfTheyCouldBeMistaken)
 {
     System("a", Package("p1", "1") + Package("x and 3 others", "1") + Package("a; b", "1"));
