@@ -129,8 +129,9 @@ TEST_F(KindsTest, ParametersOfMadeInterfacesAreLeftOut)
         fSystem->File("/sys/class/net/" + interface + "/mtu", "1500\n");
     }
     fSystem->File("/sys/class/net/eth0/device/vendor", "").File("/sys/class/net/bond0/bonding/mode", "802.3ad 4\n");
+    const std::string parameters = Lines("KALMO_KernelParameter");  // the lines are views of it
     std::string names;
-    for (const std::string_view line : SplitAt(Lines("KALMO_KernelParameter"), '\n')) {
+    for (const std::string_view line : SplitAt(parameters, '\n')) {
         names += StartsWith(line, "Name: net.ip") ? std::string(line.substr(6, line.find(',') - 6)) + "\n" : "";
     }
     EXPECT_EQ("net.ipv4.conf.all.forwarding\nnet.ipv4.conf.bond0.forwarding\nnet.ipv4.conf.default.forwarding\nnet.ipv4.conf.eth0."
