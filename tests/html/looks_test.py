@@ -4,6 +4,14 @@ from story import PICTURES, Story, page
 
 WIDTHS = (1440, 800, 390)
 
+# The distances that readers may set (WCAG 2.2, 1.4.12); they stand for wider fonts and longer paths, too.
+SPACING = '''
+const sheet = new CSSStyleSheet();
+sheet.replaceSync("* { line-height: 1.5 !important; letter-spacing: .12em !important; word-spacing: .16em !important; }");
+document.adoptedStyleSheets = [sheet];
+window.dispatchEvent(new Event("resize"));
+'''
+
 # The contrast of each text on the page with what is behind it, where it is below what WCAG asks for.
 CONTRAST = '''
 const parse = (color) => { const canvas = document.createElement("canvas"); canvas.width = canvas.height = 1;
@@ -48,6 +56,9 @@ class HowItLooks(Story):
                 self.open(name, width=width)
                 self.click('#list .finding .line').click('#list .rule-button')
                 self.assertLessEqual(self.browser.run('return document.documentElement.scrollWidth'), width, name)
+                self.browser.run(SPACING)
+                self.browser.settle()
+                self.assertLessEqual(self.browser.run('return document.documentElement.scrollWidth'), width, f'{name} with wide text')
 
     def test_lines_do_not_lie_on_each_other(self):
         for width in WIDTHS:
