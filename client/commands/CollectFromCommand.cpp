@@ -35,7 +35,7 @@ const char kNoSuchNamespace[] = "3";  // CIM_ERR_INVALID_NAMESPACE
 // A server, and what is collected from it.
 class TServerCollection {
   public:
-    TServerCollection(const TCollectFromOptions& options, IConsole& console) : fOptions(options), fConsole(console)
+    TServerCollection(const TCollectFromOptions& options, IConsole& console) : fConsole(console)
     {
         TCurlTransport::TSettings transport;
         TWbemServer::TSettings server;
@@ -153,7 +153,6 @@ class TServerCollection {
         }
     }
 
-    const TCollectFromOptions& fOptions;
     IConsole& fConsole;
     std::unique_ptr<TCurlTransport> fTransport;
     std::unique_ptr<TWbemServer> fServer;
