@@ -39,7 +39,7 @@ std::string DescribeAnswer(std::string_view input, std::size_t piece)
 void FuzzAnswer(std::string_view input)
 {
     const std::string whole = DescribeAnswer(input, std::max<std::size_t>(1, input.size()));
-    for (const std::size_t piece : {1, 7}) {
+    for (const std::size_t piece : {std::size_t{1}, std::size_t{7}}) {
         PromiseEqual(whole, DescribeAnswer(input, piece), "pieces do not matter");
     }
 }
