@@ -72,6 +72,10 @@ struct TExpatReader::TCallbacks {
     {
         Guarded(user, [=](TExpatReader& reader) {
             reader.fHasEnded = --reader.fDepth == 0;
+            if (reader.fHasEnded) {
+                reader.PassToken();
+                XML_SetDefaultHandlerExpand(reader.fParser.get(), Other);
+            }
             reader.HandOverText();
             reader.fSink.OnEnd(name);
             reader.fText.clear();
@@ -90,7 +94,16 @@ struct TExpatReader::TCallbacks {
 
     static void Instruction(void* user, const char* target, const char* data) noexcept
     {
-        Guarded(user, [=](TExpatReader& reader) { reader.fSink.OnProcessingInstruction(target, data); });
+        Guarded(user, [=](TExpatReader& reader) {
+            reader.PassToken();
+            reader.fSink.OnProcessingInstruction(target, data);
+        });
+    }
+
+    /// Blanks and comments behind the outermost element.
+    static void Other(void* user, const char*, int) noexcept
+    {
+        Guarded(user, [](TExpatReader& reader) { reader.PassToken(); });
     }
 
     static void Notation(void* user, const char* name, const char*, const char* systemId, const char* publicId) noexcept
@@ -165,7 +178,10 @@ void TExpatReader::Reset(const char* encoding, const TXmlProgress& progress)
     fText = progress.text;
     fDepth = progress.depth;
     fHasEnded = !tags.empty() && fDepth == 0;
-    fBytes = fReceived = tags.size();
+    if (fHasEnded) {
+        XML_SetDefaultHandlerExpand(fParser.get(), TCallbacks::Other);
+    }
+    fPassed = fBytes = fReceived = tags.size();
     fLinesBefore = progress.place.line - 1;
     // Of the first line, the library knows only what follows on the tags.
     fColumnsBefore = progress.place.column - 1 - tags.size();
@@ -293,6 +309,17 @@ std::size_t TExpatReader::GetPending() const
 {
     const XML_Index index = XML_GetCurrentByteIndex(fParser.get());
     return index < 0 ? 0 : fBytes - static_cast<std::size_t>(index);
+}
+
+void TExpatReader::PassToken()
+{
+    const XML_Index begin = XML_GetCurrentByteIndex(fParser.get());
+    fPassed = static_cast<std::size_t>(begin) + static_cast<std::size_t>(XML_GetCurrentByteCount(fParser.get()));
+}
+
+bool TExpatReader::IsWithinToken() const
+{
+    return fMetInvalidToken && static_cast<std::size_t>(XML_GetCurrentByteIndex(fParser.get())) != fPassed;
 }
 
 std::string_view TExpatReader::GetRest() const

@@ -39,7 +39,8 @@ class TExpatReader {
     void Stop();
     const std::string& GetError() const noexcept { return fError; }
     bool IsCutOff() const noexcept { return fIsCutOff; }
-    bool MetInvalidToken() const noexcept { return fMetInvalidToken; }
+    /// After an error behind the outermost element: whether its place is inside of a token, such as a comment.
+    bool IsWithinToken() const;
     /// Whether the outermost element has ended.
     bool HasEnded() const noexcept { return fHasEnded; }
     /// After an error: the bytes from the token in error on, as far as the library has them. Valid until the next call.
@@ -62,6 +63,7 @@ class TExpatReader {
     void Refuse(const char* reason);
     const char* FindExcess(const char** attributes);
     void HandOverText();
+    void PassToken();
 
     IXmlSink& fSink;
     std::unique_ptr<XML_ParserStruct, TFree> fParser;  // made when it is first needed
@@ -79,6 +81,7 @@ class TExpatReader {
     bool fHasEnded = false;  // the outermost element
     bool fIsCutOff = false;
     bool fMetInvalidToken = false;
+    std::size_t fPassed = 0;  // bytes up to the end of the last token at or behind the end of the outermost element
     std::size_t fUnread = 0;
     bool fRefusesDocumentTypes = false;
     TTextPlace fPlace;  // at which the parse was stopped

@@ -152,9 +152,7 @@ bool TXmlReader::HasNextDocument() const
         return false;
     }
     const std::string_view rest = fExpat->GetRest();
-    // The place of an invalid token is within it, unless it is a byte order mark.
-    return TXmlDeclaration::FindNext(rest.data(), rest.data() + rest.size()) == EXmlScan::kAccepted &&
-           (rest.front() != '<' || !fExpat->MetInvalidToken());
+    return !fExpat->IsWithinToken() && TXmlDeclaration::FindNext(rest.data(), rest.data() + rest.size()) == EXmlScan::kAccepted;
 }
 
 /// Begins the next document of a sequence at the place that Expat has refused.

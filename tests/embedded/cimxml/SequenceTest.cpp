@@ -29,6 +29,8 @@ struct TSequenceRow {
 
 const std::vector<TSequenceRow>& GetRows()
 {
+    static const std::string kUtf16("\xFF\xFE<\0b\0/\0>\0", 10);
+    static const char kInvalidInLine2[] = "<a @1:1\n</a @1:5\nnot read: not well-formed (invalid token) @2:1\n";
     static const std::vector<TSequenceRow> fgRows = {
         {"one document", "<a/>", "<a @1:1\n</a @1:5\nread @1:5\n"},
         {"two elements", "<a/><b/>", "<a @1:1\n</a @1:5\n<b @1:5\n</b @1:9\nread @1:9\n"},
@@ -43,6 +45,8 @@ const std::vector<TSequenceRow>& GetRows()
          "<a @1:1\n</a @1:5\n<b @2:1\n[x @2:17\n</b @2:17\n<c @3:1\n</c @3:5\nread @3:5\n"},
         {"a byte order mark in front of each", "\xEF\xBB\xBF<a/>\n\xEF\xBB\xBF<b/>",
          "<a @1:2\n</a @1:6\n<b @2:2\n</b @2:6\nread @2:6\n"},
+        {"another encoding behind", "<a/><!-- x -->\n<?p i?> " + kUtf16,
+         "<a @1:1\n</a @1:5\n?p i @2:1\n<b @2:10\n</b @2:14\nread @2:14\n"},
         {"encodings", "<?xml version='1.0' encoding='iso-8859-1'?><a>\xFC</a>\n<?xml version='1.0'?><b>\xC3\xBC</b>",
          "<a @1:44\n[\xC3\xBC @1:48\n</a @1:48\n<b @2:22\n[\xC3\xBC @2:26\n</b @2:26\nread @2:30\n"},
         {"the first has a document type", "<!DOCTYPE a [<!ENTITY e 'x'>]><a>&e;</a>\n<b/>",
@@ -55,6 +59,9 @@ const std::vector<TSequenceRow>& GetRows()
         {"an end tag behind", "<a/>\n</a>", "<a @1:1\n</a @1:5\nnot read: not well-formed (invalid token) @2:2\n"},
         {"a declaration alone behind", "<a/>\n<?xml version='1.0'?>", "<a @1:1\n</a @1:5\nnot read: no element found @2:22\n"},
         {"the second does not end", "<a/>\n<b>\n", "<a @1:1\n</a @1:5\n<b @2:1\nnot read: no element found @3:1\n"},
+        {"a byte order mark within a declaration", "<a/><?xml version='1.0' e>\n" + kUtf16, kInvalidInLine2},
+        {"a byte order mark within a comment", "<a/><!-- x\n" + kUtf16, kInvalidInLine2},
+        {"a byte order mark within an instruction", "<a/><?p x\n" + kUtf16, kInvalidInLine2},
         {"a less-than sign behind", "<a/>\n<", "<a @1:1\n</a @1:5\nnot read: unclosed token @2:1\n"},
     };
     return fgRows;
