@@ -17,8 +17,8 @@ void AttributeToOptions(TCoverage& coverage, const std::vector<TInventory>& inve
             cls.state = TCoverage::kLeftOutByOptions;
         }
         for (TCoverage::TLeftOut& leftOut : cls.leftOut) {
-            if (leftOut.reason == TCoverage::kLeftOutByRules && compared.count(leftOut.property) > 0) {
-                leftOut.reason = TCoverage::kSelectedOut;
+            if (leftOut.reason == TCoverage::EReason::kLeftOutByRules && compared.count(leftOut.property) > 0) {
+                leftOut.reason = TCoverage::EReason::kLeftOutByOptions;
             }
         }
     }

@@ -8,8 +8,8 @@
 
 namespace NORVZEL20 {
 
-/// Notes in the coverage of a run what the rules compare and options leave out: classes as kLeftOutByOptions, properties as
-/// kSelectedOut. `rules` are those without the options. Errors: those of the schema.
+/// Notes in the coverage of a run which classes and properties the rules compare and options leave out, as kLeftOutByOptions.
+/// `rules` are those without the options. Errors: those of the schema.
 void AttributeToOptions(TCoverage& coverage, const std::vector<TInventory>& inventories, TRules& rules);
 
 }  // namespace NORVZEL20

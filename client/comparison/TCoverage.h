@@ -27,12 +27,12 @@ struct TCoverage {
     };
 
     /// Why a property of a compared class is not compared.
-    enum EReason {
+    enum class EReason {
         kUsedAsKey,         ///< it identifies instances, and the rules do not have it compared as a property
         kNotDeclared,       ///< the reference does not declare it
         kTimeOfCollection,  ///< the plug-in leaves it out if the default is to include
         kLeftOutByRules,
-        kSelectedOut  ///< the rules have it compared, but options leave it out
+        kLeftOutByOptions  ///< the rules have it compared, but options leave it out
     };
 
     /// A property that is not compared.

@@ -161,13 +161,13 @@ std::vector<TCoverage::TLeftOut> TCoverageBuilder::LeftOut(const TInMemClass& de
 TCoverage::EReason TCoverageBuilder::WhyLeftOut(const TInMemClass& declared, const std::string& property)
 {
     if (IsUsedAsKey(declared.GetName(), property)) {
-        return TCoverage::kUsedAsKey;
+        return TCoverage::EReason::kUsedAsKey;
     }
     if (!declared.FindPropertyDecl(property)) {
-        return TCoverage::kNotDeclared;
+        return TCoverage::EReason::kNotDeclared;
     }
     const bool isIncluded = fTrace.Decide(declared.GetName(), property).treatment == TCIMDiffEngine::INCLUDE;
-    return isIncluded && property == kCollectionTime ? TCoverage::kTimeOfCollection : TCoverage::kLeftOutByRules;
+    return isIncluded && property == kCollectionTime ? TCoverage::EReason::kTimeOfCollection : TCoverage::EReason::kLeftOutByRules;
 }
 
 // Whether the property is among the keys by which instances of any inventory are matched.

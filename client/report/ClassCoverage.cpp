@@ -154,13 +154,14 @@ class TClassStatements {
     void WriteLeftOut()
     {
         std::vector<TLine> lines;
-        AddLeftOut(lines, TCoverage::kLeftOutByRules, "Properties of ", " not compared, because the rules leave them out");
-        AddLeftOut(lines, TCoverage::kSelectedOut, "Properties of ",
+        AddLeftOut(lines, TCoverage::EReason::kLeftOutByRules, "Properties of ", " not compared, because the rules leave them out");
+        AddLeftOut(lines, TCoverage::EReason::kLeftOutByOptions, "Properties of ",
                    " not compared, because of " + EscapeForDisplay(fReport.options));
-        AddLeftOut(lines, TCoverage::kTimeOfCollection, "Property of ", " not compared, because it is the time of collection");
-        AddLeftOut(lines, TCoverage::kNotDeclared, "Properties of ",
+        AddLeftOut(lines, TCoverage::EReason::kTimeOfCollection, "Property of ",
+                   " not compared, because it is the time of collection");
+        AddLeftOut(lines, TCoverage::EReason::kNotDeclared, "Properties of ",
                    " not compared, because " + Label(0) + " does not declare them");
-        AddLeftOut(lines, TCoverage::kUsedAsKey, "Properties of ", " used as keys, not compared as properties");
+        AddLeftOut(lines, TCoverage::EReason::kUsedAsKey, "Properties of ", " used as keys, not compared as properties");
         std::stable_sort(lines.begin(), lines.end(), [](const TLine& a, const TLine& b) { return a.top < b.top; });
         for (const TLine& line : lines) {
             fOut += line.text;

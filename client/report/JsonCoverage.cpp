@@ -57,13 +57,13 @@ const char* NoteName(TSchemaNote::EKind kind)
 const char* ReasonName(TCoverage::EReason reason)
 {
     switch (reason) {
-    case TCoverage::kUsedAsKey:
+    case TCoverage::EReason::kUsedAsKey:
         return "usedAsKey";
-    case TCoverage::kNotDeclared:
+    case TCoverage::EReason::kNotDeclared:
         return "notDeclared";
-    case TCoverage::kTimeOfCollection:
+    case TCoverage::EReason::kTimeOfCollection:
         return "timeOfCollection";
-    case TCoverage::kSelectedOut:
+    case TCoverage::EReason::kLeftOutByOptions:
         return "leftOutByOptions";
     default:
         return "excludedByRules";

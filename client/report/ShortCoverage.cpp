@@ -54,11 +54,11 @@ std::string Compared(const TComparisonReport& report)
     }
     std::string line = Range(counts) + (counts.size() > 2 ? " instances of each in " : " instances in ") +
                        Counted(report.coverage.CountComparedClasses(), "class", "classes") + " compared";
-    const std::size_t byRules = CountLeftOut(report.coverage, TCoverage::kLeftOutByRules);
+    const std::size_t byRules = CountLeftOut(report.coverage, TCoverage::EReason::kLeftOutByRules);
     if (byRules > 0) {
         line += "; " + Counted(byRules, "property", "properties") + " left out by " + EscapeForDisplay(report.rules);
     }
-    const std::size_t byOptions = CountLeftOut(report.coverage, TCoverage::kSelectedOut);
+    const std::size_t byOptions = CountLeftOut(report.coverage, TCoverage::EReason::kLeftOutByOptions);
     if (byOptions > 0) {
         line += "; " + Counted(byOptions, "property", "properties") + " left out by " + EscapeForDisplay(report.options);
     }
