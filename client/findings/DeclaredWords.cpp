@@ -2,7 +2,7 @@
 
 #include <string_view>
 
-#include "host/ICIMQualifier.h"
+#include "client/text/TextOfQualifier.h"
 
 namespace NORVZEL20 {
 
@@ -18,18 +18,6 @@ boost::shared_ptr<TInMemClass> FindIn(const std::vector<TInventory>& inventories
     return nullptr;
 }
 
-// What EmbeddedInstance names; empty if it is not there.
-std::string EmbeddedClassOf(const ICIMPropertyDecl& declaration)
-{
-    bool isFound = false;
-    const boost::shared_ptr<ICIMQualifier> qualifier = declaration.GetQualifier("EmbeddedInstance", isFound, TCallContext());
-    if (!isFound) {
-        return std::string();
-    }
-    const TCIMValue& value = qualifier->GetValue(TCallContext());
-    return value.IsNull() || value.GetType() != TCIMValue::TCIMType::kString ? std::string() : std::string(value.GetString());
-}
-
 }  // namespace
 
 TValueWords DeclaredWords(const std::vector<TInventory>& inventories, const std::string& className, const std::string& property)
@@ -41,8 +29,9 @@ TValueWords DeclaredWords(const std::vector<TInventory>& inventories, const std:
     if (!declaration) {
         return {};
     }
-    return dot == std::string::npos ? TValueWords(*declaration)
-                                    : DeclaredWords(inventories, EmbeddedClassOf(*declaration), property.substr(dot + 1));
+    return dot == std::string::npos
+               ? TValueWords(*declaration)
+               : DeclaredWords(inventories, TextOfQualifier(*declaration, "EmbeddedInstance"), property.substr(dot + 1));
 }
 
 }  // namespace NORVZEL20

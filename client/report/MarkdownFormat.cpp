@@ -26,11 +26,11 @@
 #include <boost/algorithm/string/classification.hpp>
 #include <boost/algorithm/string/predicate.hpp>
 #include <boost/algorithm/string/split.hpp>
-#include <map>
 #include <string>
 #include <vector>
 
 #include "client/findings/CollectFindings.h"
+#include "client/findings/InventoriesByCount.h"
 #include "client/report/BaselineText.h"
 #include "client/report/DescribeNotShown.h"
 #include "client/report/MarkdownText.h"
@@ -74,12 +74,8 @@ class TMarkdown {
     // The other inventories by their number of differences, most first.
     std::string Inventories() const
     {
-        std::map<std::size_t, std::vector<std::size_t>, std::greater<>> byCount;
-        for (std::size_t i = 1; i < fFindings.differences.size(); ++i) {
-            byCount[fFindings.differences[i]].push_back(i);
-        }
         std::string table = "| differences | inventories |\n| ---: | --- |\n";
-        for (const auto& [count, inventories] : byCount) {
+        for (const auto& [count, inventories] : InventoriesByCount(fFindings)) {
             table += "| " + std::to_string(count) + " | " + MarkdownCode(fNames.List(inventories)) + " |\n";
         }
         return table + "\n";

@@ -22,9 +22,9 @@
 
 #include <algorithm>
 #include <boost/algorithm/string/join.hpp>
-#include <map>
 
 #include "client/findings/CollectOutliers.h"
+#include "client/findings/InventoriesByCount.h"
 #include "client/report/BaselineText.h"
 #include "client/report/DescribeAgreement.h"
 #include "client/report/DescribeLargestGroup.h"
@@ -102,12 +102,8 @@ std::string TGroupedText::Counts() const
 // The inventories by their number of differences, most first, those with the same number together.
 std::string TGroupedText::WhoDiffers() const
 {
-    std::map<std::size_t, std::vector<std::size_t>, std::greater<>> byCount;
-    for (std::size_t i = 1; i < fFindings.differences.size(); ++i) {
-        if (fFindings.differences[i] > 0) {
-            byCount[fFindings.differences[i]].push_back(i);
-        }
-    }
+    TInventoriesByCount byCount = InventoriesByCount(fFindings);
+    byCount.erase(0);
     constexpr std::size_t kCountWidth = 5;
     const std::string gap(8, ' ');
     std::string text;

@@ -5,24 +5,11 @@
 #include "client/text/DisplayText.h"
 #include "client/text/InlineText.h"
 #include "client/text/ReadableTime.h"
-#include "host/ICIMQualifier.h"
+#include "client/text/TextOfQualifier.h"
 
 namespace NORVZEL20 {
 
 namespace {
-
-TCIMValue ValueOfQualifier(const ICIMPropertyDecl& declaration, const char* name)
-{
-    bool isFound = false;
-    const boost::shared_ptr<ICIMQualifier> qualifier = declaration.GetQualifier(name, isFound, TCallContext());
-    return isFound ? qualifier->GetValue(TCallContext()) : TCIMValue();
-}
-
-std::string TextOfQualifier(const ICIMPropertyDecl& declaration, const char* name)
-{
-    const TCIMValue value = ValueOfQualifier(declaration, name);
-    return value.IsNull() || value.GetType() != TCIMValue::TCIMType::kString ? std::string() : std::string(value.GetString());
-}
 
 std::vector<std::string> TextsOfQualifier(const ICIMPropertyDecl& declaration, const char* name)
 {
