@@ -7,9 +7,9 @@
 #include <string>
 #include <vector>
 
-#include "client/collect/TDescriptor.h"
 #include "client/collect/TFileText.h"
 #include "client/collect/TFolderEntry.h"
+#include "client/process/TDescriptor.h"
 
 namespace NORVZEL20 {
 

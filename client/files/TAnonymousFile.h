@@ -3,6 +3,8 @@
 #include <memory>
 #include <string>
 
+#include "client/process/TDescriptor.h"
+
 namespace NORVZEL20 {
 
 /// A file in memory, in no folder, that other code of this process can open by a path. The kernel frees it when the process ends,
@@ -16,7 +18,6 @@ class TAnonymousFile {
     static std::unique_ptr<TAnonymousFile> TryMake(const std::string& content);
     TAnonymousFile(const TAnonymousFile&) = delete;
     TAnonymousFile& operator=(const TAnonymousFile&) = delete;
-    ~TAnonymousFile();
 
     /// Valid in this process while this object lives. Each open of it begins at the start of the content.
     const std::string& GetPath() const { return fPath; }
@@ -24,7 +25,7 @@ class TAnonymousFile {
   private:
     TAnonymousFile() = default;
 
-    int fDescriptor = -1;
+    TDescriptor fDescriptor;
     std::string fPath;
 };
 

@@ -12,6 +12,7 @@
 #include "client/process/StandardDescriptors.h"
 #include "client/process/SystemError.h"
 #include "client/process/TClientError.h"
+#include "client/process/TDescriptor.h"
 
 namespace NORVZEL20 {
 
@@ -25,18 +26,17 @@ int OpenFile(const std::string& path)
         }
         return STDIN_FILENO;
     }
-    const int descriptor = open(path.c_str(), O_RDONLY | O_CLOEXEC);
-    if (descriptor < 0) {
+    TDescriptor file(open(path.c_str(), O_RDONLY | O_CLOEXEC));
+    if (!file) {
         const std::error_code reason = LastSystemError();
         throw TClientError(path + ": cannot be opened", reason);
     }
     // A directory can be opened, but not read; saying so now makes the better message.
     struct stat status;
-    if (fstat(descriptor, &status) == 0 && S_ISDIR(status.st_mode)) {
-        close(descriptor);
+    if (fstat(file.Get(), &status) == 0 && S_ISDIR(status.st_mode)) {
         throw TClientError(path + ": is a directory; name an inventory file, or - for standard input");
     }
-    return descriptor;
+    return file.Release();
 }
 
 }  // namespace

@@ -20,31 +20,24 @@ namespace {
 
 const std::size_t kReadAtOnce = 65536;
 
-// A file that is in no folder any more; -1 if there can be none.
-int OpenNamelessFile() noexcept
+// A file that is in no folder any more; not open if there can be none.
+TDescriptor OpenNamelessFile() noexcept
 {
     try {
         std::string path = BeginOfTemporaryFiles() + "XXXXXX";
         // A signal that ended the process in between would leave the name behind.
         const TSignalsHeld held;
-        const int descriptor = mkostemp(&path[0], O_CLOEXEC);
-        if (descriptor >= 0) {
+        TDescriptor file(mkostemp(&path[0], O_CLOEXEC));
+        if (file) {
             unlink(path.c_str());
         }
-        return descriptor;
+        return file;
     } catch (const std::bad_alloc&) {
-        return -1;
+        return TDescriptor();
     }
 }
 
 }  // namespace
-
-TSpooledText::~TSpooledText()
-{
-    if (fDescriptor >= 0) {
-        close(fDescriptor);
-    }
-}
 
 void TSpooledText::Append(std::string_view piece)
 {
@@ -56,10 +49,10 @@ void TSpooledText::Append(std::string_view piece)
 
 void TSpooledText::MoveToFile() noexcept
 {
-    if (fDescriptor < 0) {
-        fDescriptor = OpenNamelessFile();
+    if (!fFile) {
+        fFile = OpenNamelessFile();
     }
-    if (fDescriptor < 0 || TryWriteWhole(fDescriptor, fTail)) {
+    if (!fFile || TryWriteWhole(fFile.Get(), fTail)) {
         fIsFileClosed = true;
         return;
     }
@@ -99,7 +92,7 @@ std::size_t TSpooledText::ReadFileAt(std::uint64_t place, char* buffer, std::siz
 {
     const std::size_t most = static_cast<std::size_t>(std::min<std::uint64_t>(size, fInFile - place));
     for (;;) {
-        const ssize_t count = pread(fDescriptor, buffer, most, static_cast<off_t>(place));
+        const ssize_t count = pread(fFile.Get(), buffer, most, static_cast<off_t>(place));
         if (count > 0) {
             return static_cast<std::size_t>(count);
         }

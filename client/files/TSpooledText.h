@@ -6,6 +6,8 @@
 #include <string>
 #include <string_view>
 
+#include "client/process/TDescriptor.h"
+
 namespace NORVZEL20 {
 
 /// A text that is put together piece by piece, and read from its beginning when it is complete.
@@ -22,7 +24,6 @@ class TSpooledText {
     TSpooledText() = default;
     TSpooledText(const TSpooledText&) = delete;
     TSpooledText& operator=(const TSpooledText&) = delete;
-    ~TSpooledText();
 
     /// Errors: std::bad_alloc; the text is as before then.
     void Append(std::string_view piece);
@@ -41,7 +42,7 @@ class TSpooledText {
 
     std::string fTail;           // what is behind the text in the file
     std::uint64_t fInFile = 0;   // the length of the text in the file; more may be there, of a piece that did not fit
-    int fDescriptor = -1;        // of the file, if there is one
+    TDescriptor fFile;           // open if there is a file
     bool fIsFileClosed = false;  // whether nothing more is put into the file
 };
 

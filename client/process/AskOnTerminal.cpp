@@ -9,6 +9,7 @@
 #include <atomic>
 #include <cerrno>
 
+#include "client/process/TDescriptor.h"
 #include "client/process/WriteWhole.h"
 
 namespace NORVZEL20 {
@@ -24,29 +25,23 @@ static_assert(std::atomic<int>::is_always_lock_free, "a signal handler reads it"
 // The terminal, closed at the end.
 class TTerminal {
   public:
-    TTerminal() noexcept : fDescriptor(open("/dev/tty", O_RDWR | O_CLOEXEC | O_NOCTTY)) {}
+    TTerminal() noexcept : fOpen(open("/dev/tty", O_RDWR | O_CLOEXEC | O_NOCTTY)) {}
     TTerminal(const TTerminal&) = delete;
     TTerminal& operator=(const TTerminal&) = delete;
-    ~TTerminal()
-    {
-        ShowTypingAgain();
-        if (fDescriptor >= 0) {
-            close(fDescriptor);
-        }
-    }
+    ~TTerminal() { ShowTypingAgain(); }
 
-    int Get() const noexcept { return fDescriptor; }
+    int Get() const noexcept { return fOpen.Get(); }
 
     // Returns whether typing is hidden now.
     bool Hide() noexcept
     {
-        if (tcgetattr(fDescriptor, &gSettingsBefore) != 0) {
+        if (tcgetattr(Get(), &gSettingsBefore) != 0) {
             return false;
         }
-        gHiddenOn = fDescriptor;
+        gHiddenOn = Get();
         termios settings = gSettingsBefore;
         settings.c_lflag &= ~static_cast<tcflag_t>(ECHO);
-        return tcsetattr(fDescriptor, TCSAFLUSH, &settings) == 0;
+        return tcsetattr(Get(), TCSAFLUSH, &settings) == 0;
     }
 
     // A line without its end; nothing if the terminal is closed first.
@@ -54,7 +49,7 @@ class TTerminal {
     {
         std::string line;
         for (char c = 0; line.size() < kLongestLine;) {
-            const ssize_t count = read(fDescriptor, &c, 1);
+            const ssize_t count = read(Get(), &c, 1);
             if (count == 1 && c == '\n') {
                 return line;
             }
@@ -68,7 +63,7 @@ class TTerminal {
     }
 
   private:
-    const int fDescriptor;
+    const TDescriptor fOpen;
 };
 
 }  // namespace

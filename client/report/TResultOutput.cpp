@@ -22,6 +22,7 @@
 #include "client/files/TFileIdentity.h"
 #include "client/process/SystemError.h"
 #include "client/process/TClientError.h"
+#include "client/process/TDescriptor.h"
 #include "client/process/TReaderGone.h"
 #include "client/process/WriteWhole.h"
 
@@ -304,15 +305,10 @@ void TResultOutput::WriteTo(int descriptor, std::string_view end) const
 
 void TResultOutput::WriteSpecial(std::string_view end) const
 {
-    const int descriptor = open(fPath.c_str(), O_WRONLY | O_CLOEXEC);
-    ThrowIfFailed(descriptor);
-    try {
-        WriteTo(descriptor, end);
-    } catch (...) {
-        close(descriptor);
-        throw;
-    }
-    ThrowIfFailed(close(descriptor));
+    TDescriptor file(open(fPath.c_str(), O_WRONLY | O_CLOEXEC));
+    ThrowIfFailed(file.Get());
+    WriteTo(file.Get(), end);
+    ThrowIfFailed(close(file.Release()));
 }
 
 void TResultOutput::ReplaceFile(std::string_view end)
