@@ -15,7 +15,7 @@ bool IsField(const std::string& text)
     return isWhole && open == std::string_view::npos;
 }
 
-std::string Quoted(const std::string& text)
+std::string QuotedField(const std::string& text)
 {
     std::string quoted = "\"";
     for (const char character : text) {
@@ -34,7 +34,7 @@ std::string EntryValueText(const TAcceptedDifference::TValue& value)
 
 std::string FieldText(const std::string& text)
 {
-    return IsField(text) ? text : Quoted(text);
+    return IsField(text) ? text : QuotedField(text);
 }
 
 const char* SignOf(TDifference::EKind kind)
@@ -58,7 +58,7 @@ std::string EntryText(const TAcceptedDifference& entry)
     text += " in ";
     for (std::size_t i = 0; i < entry.inventories.size(); ++i) {
         const std::string& label = entry.inventories[i];
-        text += (i == 0 ? "" : ", ") + (label.find(',') == std::string::npos ? FieldText(label) : Quoted(label));
+        text += (i == 0 ? "" : ", ") + (label.find(',') == std::string::npos ? FieldText(label) : QuotedField(label));
     }
     return text;
 }

@@ -5,6 +5,7 @@
 #include "client/collect/CollectKinds.h"
 #include "client/collect/read/ReadHardware.h"
 #include "client/collect/read/TextPieces.h"
+#include "client/text/NumberIn.h"
 
 namespace NORVZEL20 {
 

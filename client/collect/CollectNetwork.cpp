@@ -10,6 +10,7 @@
 #include "client/collect/CollectKinds.h"
 #include "client/collect/read/ReadNetwork.h"
 #include "client/collect/read/TextPieces.h"
+#include "client/text/NumberIn.h"
 
 namespace NORVZEL20 {
 

@@ -1,6 +1,6 @@
 #include "client/collect/CollectKinds.h"
 #include "client/collect/read/ReadOsRelease.h"
-#include "client/collect/read/TextPieces.h"
+#include "client/text/NumberIn.h"
 
 namespace NORVZEL20 {
 

@@ -3,7 +3,6 @@
 #include <sys/ioctl.h>
 #include <unistd.h>
 
-#include <charconv>
 #include <cstdlib>
 #include <cstring>
 
@@ -12,6 +11,7 @@
 #include "client/process/TReaderGone.h"
 #include "client/process/WriteWhole.h"
 #include "client/text/DisplayText.h"
+#include "client/text/NumberIn.h"
 
 namespace NORVZEL20 {
 
@@ -36,16 +36,6 @@ bool IsSet(const char* variable)
 bool IsForced(const char* variable)
 {
     return IsSet(variable) && std::strcmp(std::getenv(variable), "0") != 0;
-}
-
-// The number that the variable has; 0 if it has none.
-std::size_t NumberIn(const char* variable)
-{
-    const char* const value = IsSet(variable) ? std::getenv(variable) : "";
-    std::size_t number = 0;
-    const char* const end = value + std::strlen(value);
-    const std::from_chars_result read = std::from_chars(value, end, number);
-    return read.ec == std::errc() && read.ptr == end ? number : 0;
 }
 
 // Writes a line without allocating. Escaping would need memory, so ? stands for everything that is not printable ASCII.
@@ -83,7 +73,7 @@ std::size_t TStandardConsole::GetWidth() const
     if (isatty(STDOUT_FILENO) != 0 && ioctl(STDOUT_FILENO, TIOCGWINSZ, &size) == 0 && size.ws_col > 0) {
         return size.ws_col;
     }
-    return NumberIn("COLUMNS");
+    return IsSet("COLUMNS") ? NumberIn(std::getenv("COLUMNS")).value_or(0) : 0;
 }
 
 void TStandardConsole::Say(std::string_view line) noexcept

@@ -41,7 +41,7 @@ std::string AsUtf8(std::string_view text)
     return out.append(text);
 }
 
-std::string Quoted(const std::string& cell)
+std::string QuotedCell(const std::string& cell)
 {
     if (cell.find_first_of(",\"\r\n") == std::string::npos) {
         return cell;
@@ -55,7 +55,7 @@ std::string Quoted(const std::string& cell)
 
 std::string TextCell(std::string_view text)
 {
-    return Quoted((MayBeginFormula(text) ? "'" : "") + AsUtf8(text));
+    return QuotedCell((MayBeginFormula(text) ? "'" : "") + AsUtf8(text));
 }
 
 bool IsText(const TCIMValue& value)
@@ -69,7 +69,7 @@ std::string ValueCell(const TCIMValue& value)
     if (value.IsNull()) {
         return std::string();
     }
-    return IsText(value) ? TextCell(value.ToText()) : Quoted(AsUtf8(value.ToText()));
+    return IsText(value) ? TextCell(value.ToText()) : QuotedCell(AsUtf8(value.ToText()));
 }
 
 std::string TypeCell(const TCIMValue& value)

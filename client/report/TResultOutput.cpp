@@ -16,7 +16,6 @@
 #include <sys/stat.h>
 #include <unistd.h>
 
-#include <charconv>
 #include <utility>
 
 #include "client/files/TFileIdentity.h"
@@ -25,6 +24,7 @@
 #include "client/process/TDescriptor.h"
 #include "client/process/TReaderGone.h"
 #include "client/process/WriteWhole.h"
+#include "client/text/NumberIn.h"
 
 namespace NORVZEL20 {
 
@@ -47,13 +47,6 @@ std::string RealPath(const std::string& path)
     return realpath(path.c_str(), real) == nullptr ? std::string() : real;
 }
 
-std::optional<int> NumberOf(std::string_view text)
-{
-    int number = 0;
-    const std::from_chars_result read = std::from_chars(text.data(), text.data() + text.size(), number);
-    return read.ec == std::errc() ? std::optional<int>(number) : std::nullopt;
-}
-
 // The descriptor of this process that a path such as /proc/self/fd/1 stands for, open or not, if it is one of those paths.
 std::optional<int> DescriptorNamed(const std::string& path)
 {
@@ -61,7 +54,8 @@ std::optional<int> DescriptorNamed(const std::string& path)
     if (folder.empty() || RealPath(FolderOf(path)) != folder) {
         return std::nullopt;
     }
-    return NumberOf(std::string_view{path}.substr(FolderOf(path).size()));
+    const std::optional<std::uint64_t> number = NumberIn(std::string_view{path}.substr(FolderOf(path).size()));
+    return number && *number <= INT_MAX ? std::optional<int>(static_cast<int>(*number)) : std::nullopt;
 }
 
 // The end of a path.

@@ -12,6 +12,7 @@
 
 #include "client/text/DisplayText.h"
 #include "client/text/InlineText.h"
+#include "client/text/NumberIn.h"
 
 namespace NORVZEL20 {
 
@@ -50,24 +51,16 @@ struct TPower {
     int exponent;
 };
 
-std::optional<std::uint64_t> NumberOf(const std::string& text)
-{
-    constexpr std::size_t kMostDigits = 18;  // of a number that surely fits
-    const bool isNumber = !text.empty() && text.size() <= kMostDigits &&
-                          std::all_of(text.begin(), text.end(), [](char c) { return c >= '0' && c <= '9'; });
-    return isNumber ? std::optional<std::uint64_t>(std::stoull(text)) : std::nullopt;
-}
-
 // "10^6", "2^-3", "1000".
 std::optional<TPower> PowerOf(const std::string& text)
 {
     const std::size_t caret = text.find('^');
-    const std::optional<std::uint64_t> base = NumberOf(text.substr(0, caret));
+    const std::optional<std::uint64_t> base = NumberIn(text.substr(0, caret));
     if (!base || caret == std::string::npos) {
         return base ? std::optional<TPower>({*base, 1}) : std::nullopt;
     }
     const bool isNegative = text.compare(caret + 1, 1, "-") == 0;
-    const std::optional<std::uint64_t> exponent = NumberOf(text.substr(caret + (isNegative ? 2 : 1)));
+    const std::optional<std::uint64_t> exponent = NumberIn(text.substr(caret + (isNegative ? 2 : 1)));
     constexpr std::uint64_t kMostExponent = 63;
     if (!exponent || *exponent > kMostExponent) {
         return std::nullopt;

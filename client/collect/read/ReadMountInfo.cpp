@@ -10,6 +10,7 @@
 
 #include "client/collect/read/TTextLines.h"
 #include "client/collect/read/TextPieces.h"
+#include "client/text/NumberIn.h"
 
 namespace NORVZEL20 {
 

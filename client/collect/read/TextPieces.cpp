@@ -1,7 +1,6 @@
 #include "client/collect/read/TextPieces.h"
 
 #include <algorithm>
-#include <charconv>
 
 #include "embedded/value/TUtf8.h"
 
@@ -53,17 +52,6 @@ std::vector<std::string> ListOf(std::string_view text, char separator)
         }
     }
     return list;
-}
-
-std::optional<std::uint64_t> NumberIn(std::string_view text, int base)
-{
-    std::uint64_t number = 0;
-    const char* const end = text.data() + text.size();
-    const std::from_chars_result read = std::from_chars(text.data(), end, number, base);
-    if (read.ec != std::errc() || read.ptr != end) {
-        return std::nullopt;
-    }
-    return number;
 }
 
 bool StartsWith(std::string_view text, std::string_view start)

@@ -1,7 +1,5 @@
 #pragma once
 
-#include <cstdint>
-#include <optional>
 #include <string>
 #include <string_view>
 #include <vector>
@@ -19,9 +17,6 @@ std::vector<std::string_view> SplitAtBlanks(std::string_view text);
 
 /// The same as texts, for arrays of a separated list without empty pieces.
 std::vector<std::string> ListOf(std::string_view text, char separator);
-
-/// The text as a whole as a number without a sign; nothing if it is no such number or too great.
-std::optional<std::uint64_t> NumberIn(std::string_view text, int base = 10);
 
 bool StartsWith(std::string_view text, std::string_view start);
 bool EndsWith(std::string_view text, std::string_view end);
