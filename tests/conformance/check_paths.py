@@ -1,7 +1,7 @@
-"""Fails if a document names a file or folder of this tree that does not exist, or a function that the named file does not hold.
+"""Fails if a document names a file, folder, type or heading that does not exist, or a function that the named file does not hold.
 
-Argument: ROOT. Looked at are words in backticks that begin with a top-level folder, links between documents, and, in docs/where.md, the
-word in backticks that follows a path after a comma.
+Argument: ROOT. Looked at are words in backticks that begin with a top-level folder, are the name of a source or of a type, and the word
+in backticks that follows a path after a comma; and links between documents. A name with Xxx in it stands for many.
 """
 
 import pathlib
@@ -10,7 +10,10 @@ import sys
 
 DOCUMENTS = ["*.md", "docs/*.md", "fuzz/*.md", "fuzz/*/*.md", "tests/**/*.md", "bench/*.md", "data/**/*.md"]
 WORD = re.compile(r"`([^`\s]+)`")
-LINK = re.compile(r"\]\(([^)#\s]+)[^)]*\)")
+SOURCE = re.compile(r"[A-Z]\w*\.(?:h|cpp)")
+TYPE = re.compile(r"[TI][A-Z][a-z]\w+")
+LINK = re.compile(r"\]\(([^)#\s]*)(?:#([^)\s]*))?[^)]*\)")
+HEADING = re.compile(r"^#+ (.*)$", re.M)
 FUNCTION = re.compile(r"`([^`\s]+\.(?:h|cpp))`, `(\w+)`")
 
 
@@ -26,8 +29,30 @@ def exists(root, name):
     return (root / name).exists() or any(root.glob(name + ".*"))
 
 
+def sources(root, folders):
+    """The names of all sources, and of the types that headers are named after."""
+    names = {path.name for folder in folders for path in (root / folder).rglob("*") if path.suffix in {".h", ".cpp"}}
+    return names, {pathlib.PurePath(name).stem for name in names}
+
+
+def anchors(document):
+    """What a link may have behind #, as the pages of the forge name headings."""
+    headings = HEADING.findall(document.read_text(encoding="utf-8"))
+    return {re.sub(r"[^\w -]", "", heading.strip().lower()).replace(" ", "-") for heading in headings}
+
+
+def link_fault(document, link, anchor):
+    target = document.parent / link if link else document
+    if not target.exists():
+        return f"links to {link}, which does not exist"
+    if anchor and target.suffix == ".md" and anchor not in anchors(target):
+        return f"links to {link}#{anchor}, but that document has no such heading"
+    return None
+
+
 def faults(root):
     folders = tops(root)
+    names, types = sources(root, folders)
     checked = 0
     for pattern in DOCUMENTS:
         for document in sorted(root.glob(pattern)):
@@ -39,11 +64,15 @@ def faults(root):
                     checked += 1
                     if not exists(root, word):
                         yield f"{shown}: names {word}, which does not exist"
-            for link in LINK.findall(text):
+                known = names if SOURCE.fullmatch(word) else types if TYPE.fullmatch(word) else {word}
+                if word not in known and "Xxx" not in word:
+                    yield f"{shown}: names {word}, which does not exist"
+            for link, anchor in LINK.findall(text):
                 if "://" not in link:
                     checked += 1
-                    if not (document.parent / link).exists():
-                        yield f"{shown}: links to {link}, which does not exist"
+                    fault = link_fault(document, link, anchor)
+                    if fault:
+                        yield f"{shown}: {fault}"
             for path, function in FUNCTION.findall(text):
                 if (root / path).is_file() and not re.search(rf"\b{function}\b", (root / path).read_text(encoding="utf-8")):
                     yield f"{shown}: {path} holds no {function}"
