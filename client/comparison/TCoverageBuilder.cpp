@@ -41,7 +41,8 @@ TCoverage TCoverageBuilder::Build()
             coverage.lacks.push_back({i, what});
         }
         for (const TOwnName& name : fInventories[i].ownNames) {
-            if (name.replaced + name.marked > 0) {
+            const bool isUnused = !name.isInKeys && !TNameText::Equal(name.name, name.comparedAs);
+            if (name.replaced + name.marked > 0 || isUnused) {
                 coverage.names.push_back({i, name});
             }
         }

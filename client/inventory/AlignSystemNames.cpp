@@ -7,10 +7,12 @@
 #include <string>
 #include <utility>
 
+#include "client/inventory/CollectObjects.h"
 #include "client/inventory/FindOwnName.h"
 #include "client/inventory/TNameReplacement.h"
 #include "client/process/TClientError.h"
 #include "client/text/DisplayText.h"
+#include "embedded/store/TInMemInstance.h"
 #include "embedded/store/TKeyTexts.h"
 #include "embedded/value/TNameText.h"
 
@@ -70,17 +72,43 @@ std::vector<TNames> ReadSame(const std::vector<std::string>& options)
     return systems;
 }
 
-// How often an inventory has each text in its keys and references, in the spelling that comes first. Only texts of `asked` count.
-TNameMap<std::size_t> CountNames(const TInventory& inventory, const std::vector<TNames>& asked)
+// How often each name comes, in the spelling that comes first.
+using TNameCounts = TNameMap<std::size_t>;
+using TNameCount = TNameCounts::value_type;
+
+void CountIfAsked(TNameCounts& counts, std::string_view text, const std::vector<TNames>& asked)
 {
-    TNameMap<std::size_t> counts;
+    const std::string name(text);
+    if (std::any_of(asked.begin(), asked.end(), [&name](const TNames& names) { return HasName(names, name); })) {
+        ++counts[name];
+    }
+}
+
+// How often an inventory has the names of `asked` in its keys and references.
+TNameCounts CountNames(const TInventory& inventory, const std::vector<TNames>& asked)
+{
+    TNameCounts counts;
     TKeyTexts(*inventory.ns).Change([&](std::string_view text, const TKeyTexts::TPlace&) {
-        const std::string name(text);
-        if (std::any_of(asked.begin(), asked.end(), [&name](const TNames& names) { return HasName(names, name); })) {
-            ++counts[name];
-        }
+        CountIfAsked(counts, text, asked);
         return TCIMValue();
     });
+    return counts;
+}
+
+// How often an inventory has them as values of any property.
+TNameCounts CountValues(const TInventory& inventory, const std::vector<TNames>& asked)
+{
+    TNameCounts counts;
+    for (const boost::shared_ptr<TInMemClass>& cls : inventory.ns->GetClasses()) {
+        for (const boost::shared_ptr<ICIMInstance>& instance : InstancesOf(*cls)) {
+            for (const std::uint32_t slot : cls->GetLayout().GetOrder()) {
+                const TCIMValue& value = static_cast<const TInMemInstance&>(*instance).GetSlotValue(slot);
+                if (value.GetType() == TCIMValue::TCIMType::kString && !value.IsNull() && !value.GetEmbeddedObject()) {
+                    CountIfAsked(counts, value.GetString(), asked);
+                }
+            }
+        }
+    }
     return counts;
 }
 
@@ -91,7 +119,8 @@ class TSameNames {
         : fInventories(inventories), fSystems(ReadSame(options))
     {
         for (const TInventory& inventory : fInventories) {
-            fCounts.push_back(CountNames(inventory, fSystems));
+            fKeys.push_back(CountNames(inventory, fSystems));
+            fValues.push_back(CountValues(inventory, fSystems));
         }
     }
 
@@ -102,12 +131,12 @@ class TSameNames {
             const std::string used = FindOwn(0, names);
             if (used.empty()) {
                 throw TClientError(fInventories[0].path + ": has none of the names " + Listed(names) +
-                                   " in its keys and references; it is the reference, whose name all get");
+                                   ", neither in its keys and references nor as a value; it is the reference, whose name all get");
             }
             for (std::size_t i = 0; i < fInventories.size(); ++i) {
                 const std::string own = i == 0 ? used : FindOwn(i, names);
                 if (!own.empty()) {
-                    fInventories[i].ownNames.push_back({own, used, 0, 0, {}});
+                    fInventories[i].ownNames.push_back({own, used});
                 }
             }
             RequireAll(names);
@@ -124,23 +153,22 @@ class TSameNames {
         return list;
     }
 
-    // The inventory's own name as it spells it; empty if it has none of them.
     // Which of several names is the own one is not to be guessed.
-    void RefuseTie(std::size_t inventory, const TNames& names, const std::pair<const std::string, std::size_t>& own) const
+    void RefuseTie(const TInventory& inventory, const TNames& names, const TNameCounts& counts, const TNameCount& own) const
     {
         for (const std::string& name : names) {
-            const auto found = fCounts[inventory].find(name);
-            if (found != fCounts[inventory].end() && found->second == own.second && !TNameText::Equal(found->first, own.first)) {
-                throw TClientError(fInventories[inventory].path + ": has the names " + EscapeForDisplay(own.first) + " and " +
+            const auto found = counts.find(name);
+            if (found != counts.end() && found->second == own.second && !TNameText::Equal(found->first, own.first)) {
+                throw TClientError(inventory.path + ": has the names " + EscapeForDisplay(own.first) + " and " +
                                    EscapeForDisplay(found->first) +
                                    " equally often in its keys and references, so its own one is not known; use --self");
             }
         }
     }
 
-    std::string FindOwn(std::size_t inventory, const TNames& names)
+    // The one of the names that comes most often, as the inventory spells it; empty if none does.
+    std::string FindMostFrequent(const TInventory& inventory, const TNames& names, const TNameCounts& counts) const
     {
-        const TNameMap<std::size_t>& counts = fCounts[inventory];
         auto own = counts.end();
         for (const std::string& name : names) {
             const auto found = counts.find(name);
@@ -148,39 +176,60 @@ class TSameNames {
                 own = found;
             }
         }
-        if (own != counts.end()) {
-            RefuseTie(inventory, names, *own);
-            return own->first;
-        }
-        if (!HasName(names, fInventories[inventory].label)) {
+        if (own == counts.end()) {
             return std::string();
         }
-        fLabels.insert(fInventories[inventory].label);
-        return FindOwnName(fInventories[inventory], kSystemNameProperty);
+        RefuseTie(inventory, names, counts, *own);
+        return own->first;
+    }
+
+    // The inventory's own name as it spells it; empty if it has none of them. A name that is only a value stands for a system that
+    // no key names.
+    std::string FindOwn(std::size_t i, const TNames& names)
+    {
+        const TInventory& inventory = fInventories[i];
+        const std::string own = FindMostFrequent(inventory, names, fKeys[i]);
+        if (!own.empty()) {
+            return own;
+        }
+        if (HasName(names, inventory.label)) {
+            fLabels.insert(inventory.label);
+            return FindOwnName(inventory, kSystemNameProperty);
+        }
+        return FindMostFrequent(inventory, names, fValues[i]);
     }
 
     // A name that is nowhere is a mistake in writing.
     void RequireAll(const TNames& names) const
     {
         for (const std::string& name : names) {
-            const bool isSomewhere =
-                fLabels.count(name) > 0 ||
-                std::any_of(fCounts.begin(), fCounts.end(), [&name](const auto& counts) { return counts.count(name) > 0; });
+            const auto hasName = [&name](const TNameCounts& counts) { return counts.count(name) > 0; };
+            const bool isSomewhere = fLabels.count(name) > 0 || std::any_of(fKeys.begin(), fKeys.end(), hasName) ||
+                                     std::any_of(fValues.begin(), fValues.end(), hasName);
             if (!isSomewhere) {
                 throw TClientError("no inventory has the name " + DisplayLabel(name) +
-                                   " of --same in its keys and references, nor as its label; letter case does not count");
+                                   " of --same in its keys and references, as a value or as its label; letter case does not count");
             }
         }
     }
 
     std::vector<TInventory>& fInventories;
     std::vector<TNames> fSystems;
-    std::vector<TNameMap<std::size_t>> fCounts;  // of each inventory
+    std::vector<TNameCounts> fKeys;    // of each inventory, in keys and references
+    std::vector<TNameCounts> fValues;  // the same, as values
     std::set<std::string, TNameText::TLess> fLabels;
 };
 
 void Replace(TInventory& inventory)
 {
+    TNames ownNames;
+    for (const TOwnName& own : inventory.ownNames) {
+        ownNames.push_back(own.name);
+    }
+    const TNameCounts counts = CountNames(inventory, {ownNames});
+    for (TOwnName& own : inventory.ownNames) {
+        own.isInKeys = counts.count(own.name) > 0;
+    }
     TNameReplacement replacement(inventory.ownNames);
     const std::string twice = TKeyTexts(*inventory.ns).Change([&](std::string_view text, const TKeyTexts::TPlace& place) {
         return replacement.Replace(text, place);
@@ -203,7 +252,7 @@ void AlignSystemNames(std::vector<TInventory>& inventories, const TSystemNames& 
     if (!options.self.empty()) {
         const std::string used = FindOwnName(inventories.front(), options.self);
         for (TInventory& inventory : inventories) {
-            inventory.ownNames.push_back({FindOwnName(inventory, options.self), used, 0, 0, {}});
+            inventory.ownNames.push_back({FindOwnName(inventory, options.self), used});
         }
     }
     if (!options.same.empty()) {

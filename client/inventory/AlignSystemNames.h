@@ -16,9 +16,10 @@ void CheckSystemNames(const TSystemNames& options);
 ///
 /// Of several names that mean one system, an inventory's own is the one that it has most often in keys and references; of the
 /// reference, it is the one that is used for all. A name that an inventory does not have may be its label instead: its own name is
-/// then looked for as by `self`. Errors: TClientError if no own name is found, a name is found nowhere, or two instances would have
+/// then looked for as by `self`; or it may be the value of a property. An inventory whose own name is in no key or reference stays
+/// as it is. Errors: TClientError if the reference has no own name, a name is found nowhere, or two instances would have
 /// the same keys; std::bad_alloc. Other inventories may be changed by then.
-/// Cost: some passes over the keys and references of each inventory.
+/// Cost: some passes over the keys, references and values of each inventory.
 void AlignSystemNames(std::vector<TInventory>& inventories, const TSystemNames& options);
 
 }  // namespace NORVZEL20

@@ -54,6 +54,9 @@ bool Holds(std::string_view text, std::string_view name)
 TCIMValue TNameReplacement::Replace(std::string_view text, const TKeyTexts::TPlace& place)
 {
     for (TOwnName& own : fNames) {
+        if (!own.isInKeys) {
+            continue;
+        }
         if (TNameText::Equal(text, own.name)) {
             if (text == own.comparedAs) {
                 return TCIMValue();

@@ -143,6 +143,22 @@ void AddSharing(std::vector<std::string>& reservations, const TCoverage& coverag
     }
 }
 
+void AddNames(std::vector<std::string>& reservations, const TCoverage& coverage)
+{
+    std::vector<std::string> unused;
+    for (const TCoverage::TName& entry : coverage.names) {
+        if (!entry.name.isInKeys) {
+            unused.push_back(QuoteForDisplay(entry.name.name));
+        }
+    }
+    if (coverage.names.size() > unused.size()) {
+        reservations.push_back(Counted(coverage.names.size() - unused.size(), "system") + " compared under another name");
+    }
+    if (!unused.empty()) {
+        reservations.push_back("nothing replaced, because no key or reference is " + SomeOf(unused));
+    }
+}
+
 void AddBadValues(std::vector<std::string>& reservations, const TCoverage& coverage)
 {
     std::size_t asText = 0;
@@ -191,9 +207,7 @@ std::string Reservations(const TComparisonReport& report)
     const TCoverage& coverage = report.coverage;
     std::vector<std::string> reservations;
     AddInferred(reservations, report);
-    if (!coverage.names.empty()) {
-        reservations.push_back(Counted(coverage.names.size(), "system") + " compared under another name");
-    }
+    AddNames(reservations, coverage);
     AddBadValues(reservations, coverage);
     AddSharing(reservations, coverage);
     AddDeclarations(reservations, coverage);

@@ -86,6 +86,20 @@ class TStatement {
             }
             WriteNamesWithin(entry);
         }
+        WriteUnusedNames();
+    }
+
+    void WriteUnusedNames()
+    {
+        std::vector<std::string> names;
+        for (const TCoverage::TName& entry : fCoverage.names) {
+            if (!entry.name.isInKeys) {
+                names.push_back(QuoteForDisplay(entry.name.name) + " of " + Label(entry.inventory));
+            }
+        }
+        if (!names.empty()) {
+            fOut += "Nothing was replaced, because no key or reference is the name: " + SomeOf(names) + ".\n";
+        }
     }
 
     void WriteNamesWithin(const TCoverage::TName& entry)

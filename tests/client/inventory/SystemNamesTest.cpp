@@ -206,10 +206,12 @@ TEST_F(SystemNamesTest, WhatIsAmbiguousOrMissingIsRefused)
         "the names themselves with --same\n",
         Compare({two, two}, {"--self", "Colour"}));
     EXPECT_EQ(
-        "cimdelta: no inventory has the name array9 of --same in its keys and references, nor as its label; letter case does not "
-        "count\n",
+        "cimdelta: no inventory has the name array9 of --same in its keys and references, as a value or as its label; letter case "
+        "does not count\n",
         Compare({ArrayOf("array1", 1), ArrayOf("array2", 1)}, {"--same", "array1=array9"}));
-    EXPECT_EQ("cimdelta: a.xml: has none of the names x, y in its keys and references; it is the reference, whose name all get\n",
+    EXPECT_EQ("cimdelta: a.xml: has none of the names x, y, neither in its keys and references nor as a value; it is the "
+              "reference, whose "
+              "name all get\n",
               Compare({ArrayOf("array1", 1), ArrayOf("array2", 1)}, {"--same", "x=y"}));
     EXPECT_EQ(
         "cimdelta: b.xml: has the names array1 and array2 equally often in its keys and references, so its own one is not known; "
@@ -221,6 +223,69 @@ TEST_F(SystemNamesTest, WhatIsAmbiguousOrMissingIsRefused)
     EXPECT_EQ("cimdelta: --same a=a names one name only; join different names that mean one system: --same web01=web02\n",
               Compare({two, two}, {"--same", "a=a"}));
     EXPECT_EQ("cimdelta: --self excludes --same; see cimdelta compare --help\n", Compare({two, two}, {"--same", "a=b", "--self"}));
+}
+
+/// An inventory as of "cimdelta collect": no key holds the name of the system.
+std::string MachineOf(const std::string& name, const std::string& others = "")
+{
+    return Class("KALMO_ComputerSystem", "", KeyProperty("InstanceID") + Declaration("Name", "string")) +
+           Class("User", "", KeyProperty("Name")) +
+           Instance("KALMO_ComputerSystem", Value("InstanceID", "system") + Value("Name", name)) + others;
+}
+
+std::string UserOf(const std::string& name)
+{
+    return Instance("User", Value("Name", name));
+}
+
+TEST_F(SystemNamesTest, NamesThatNoKeyHoldsAreNotReplaced)
+{
+    for (const std::vector<std::string>& options : {std::vector<std::string>{"--same", "web01=WEB02"}, {"--self"}}) {
+        const std::string report = Compare({MachineOf("web01", UserOf("root")), MachineOf("web02", UserOf("root"))}, options);
+        EXPECT_NE(std::string::npos, report.find("~ InstanceID=\"system\"\n    Name: web01 -> web02\n")) << report;
+        EXPECT_NE(std::string::npos,
+                  report.find("\nNothing was replaced, because no key or reference is the name: \"web02\" of b.\n"))
+            << report;
+        EXPECT_EQ(1, fStatus) << options.front();
+    }
+    EXPECT_NE(std::string::npos,
+              Compare({MachineOf("web01"), MachineOf("web02")}, {"--self", "-o", "ndjson"})
+                  .find("\"systemNames\":[{\"inventory\":\"b\",\"name\":\"web02\",\"comparedAs\":\"web01\",\"texts\":0,"));
+}
+
+TEST_F(SystemNamesTest, ShortReportSaysInOneLineThatNothingWasReplaced)
+{
+    const std::string a = Scratch("a.xml", Document(System() + MachineOf("web01")));
+    const std::string b = Scratch("b.xml", Document(System() + MachineOf("web02")));
+    Run({"compare", a, b, "--same", "web01=web02"});
+    EXPECT_NE(std::string::npos, fOut.find("\nnothing replaced, because no key or reference is \"web02\" (--coverage)\n")) << fOut;
+}
+
+/// A user may be called as a system; then no system is meant.
+TEST_F(SystemNamesTest, WithoutOwnNameInKeysNothingIsMarked)
+{
+    EXPECT_EQ("1 difference between a and b: 1 changed value in 1 instance\n",
+              Told({MachineOf("backup", UserOf("backup")), MachineOf("web02", UserOf("backup"))}, {"--self"}, "-"));
+}
+
+TEST_F(SystemNamesTest, MachineAndArrayMeetUnderOneName)
+{
+    const std::string classes = Class("KALMO_ComputerSystem", "", KeyProperty("Id") + Declaration("Name", "string")) +
+                                Class("Disk", "", KeyProperty("SystemName") + KeyProperty("Id"));
+    const std::string a = classes + Instance("KALMO_ComputerSystem", Value("Id", "1") + Value("Name", "array1"));
+    const std::string b = a + DiskOf("array2", "1");
+    const std::string report = Compare({a, b}, {"--same", "array1=array2"});
+    EXPECT_NE(std::string::npos, report.find("Disk\n+ Id=\"1\",SystemName=\"array1\"\n")) << report;
+}
+
+TEST_F(SystemNamesTest, MistypedNameIsNoticedWhereNoKeyHoldsNames)
+{
+    EXPECT_EQ("cimdelta: no inventory has the name wbe01 of --same in its keys and references, as a value or as its label; letter "
+              "case does not count\n",
+              Compare({MachineOf("web02"), MachineOf("web01")}, {"--same", "wbe01=web02"}));
+    EXPECT_EQ("cimdelta: a.xml: has none of the names wbe01, web02, neither in its keys and references nor as a value; it is the "
+              "reference, whose name all get\n",
+              Compare({MachineOf("web01"), MachineOf("web02")}, {"--same", "wbe01=web02"}));
 }
 
 TEST_F(SystemNamesTest, WhereNothingMatchesThereIsAHint)
