@@ -46,7 +46,7 @@ void CheckBaselineFiles(const TCommandFiles& files, std::vector<std::string>& in
     if (files.accept.empty()) {
         return;
     }
-    CheckOutput(files.accept, inputs);
+    CheckPlainOutput(files.accept, inputs);
     inputs.push_back(files.accept);
 }
 

@@ -15,7 +15,7 @@ void CheckSavedRules(const std::string& path, const std::vector<std::string>& in
     if (IsStandardOutput(path)) {
         throw TClientError("--save-rules writes a file, since the result goes to standard output; name a file");
     }
-    CheckOutput(path, inputs);
+    CheckPlainOutput(path, inputs);
 }
 
 void SaveRules(const std::string& path, const TComparisonReport& report, const TSelection& selection, IConsole& console)

@@ -6,6 +6,8 @@
 //   a device or a pipe    is opened and written to;
 //   an ordinary file      is replaced: the text goes to a temporary file in the same folder (a rename cannot leave its file
 //                         system), which gets the old file's owner and rights, is synced, and takes the name over by rename().
+// A path whose name asks for it gets its text compressed, whatever it leads to.
+//
 // A failure, or the end of the process, before the rename leaves the old file as it was. Descriptors, devices and pipes get nothing
 // before the result is complete, and neither does standard output: their text waits in a TSpooledText.
 #include "client/report/TResultOutput.h"
@@ -221,6 +223,7 @@ void CheckOutput(const std::string& path, const std::vector<std::string>& inputs
     if (IsStandardOutput(path)) {
         return;
     }
+    CompressionOfName(path);
     try {
         CheckTarget(path);
         CheckNotRead(path, inputs);
@@ -229,10 +232,23 @@ void CheckOutput(const std::string& path, const std::vector<std::string>& inputs
     }
 }
 
+void CheckPlainOutput(const std::string& path, const std::vector<std::string>& inputs)
+{
+    CheckOutput(path, inputs);
+    if (const std::string kind = CompressionOfName(path); !kind.empty()) {
+        throw TClientError(path + ": found a name for " + kind +
+                           ", expected one for plain text, as which the file is to be read; "
+                           "give the file another name");
+    }
+}
+
 TResultOutput::TResultOutput(IConsole& console, std::string path) : fConsole(console), fPath(std::move(path))
 {
     if (IsStandardOutput(fPath)) {
         return;
+    }
+    if (const std::string kind = CompressionOfName(fPath); !kind.empty()) {
+        fCompressor = std::make_unique<TCompressor>(kind, [this](std::string_view piece) { Keep(piece); });
     }
     try {
         const TTarget target = FollowLinks(fPath);
@@ -248,6 +264,15 @@ TResultOutput::TResultOutput(IConsole& console, std::string path) : fConsole(con
 }
 
 void TResultOutput::Write(std::string_view piece)
+{
+    if (fCompressor) {
+        fCompressor->Write(piece);
+    } else {
+        Keep(piece);
+    }
+}
+
+void TResultOutput::Keep(std::string_view piece)
 {
     if (!fFile) {
         fText.Append(piece);
@@ -271,6 +296,11 @@ void TResultOutput::WriteToFile()
 
 void TResultOutput::Deliver(std::string_view end)
 {
+    if (fCompressor) {
+        fCompressor->Write(end);
+        fCompressor->End();
+        end = std::string_view();
+    }
     try {
         if (IsStandardOutput(fPath)) {
             ForEachPiece(end, [this](std::string_view piece) { fConsole.WriteResult(piece); });

@@ -6,6 +6,7 @@
 #include <string_view>
 #include <vector>
 
+#include "client/files/TCompressor.h"
 #include "client/files/TSpooledText.h"
 #include "client/files/TUnfinishedFile.h"
 #include "client/process/IConsole.h"
@@ -21,12 +22,17 @@ bool IsStandardOutput(const std::string& path);
 bool AreSameTarget(const std::string& a, const std::string& b);
 
 /// Checks, without changing anything, whether a result can be delivered to that path and would not replace one of the `inputs`,
-/// which are paths too, with "-" for standard input. A device may still turn out to be full.
+/// which are paths too, with "-" for standard input, nor has a name that asks for an unknown compression. A device may still turn
+/// out to be full.
 /// Errors: TClientError.
 void CheckOutput(const std::string& path, const std::vector<std::string>& inputs);
 
+/// The same for rules and accepted differences, which are read as plain text only. Errors: also TClientError if the name asks for
+/// compression.
+void CheckPlainOutput(const std::string& path, const std::vector<std::string>& inputs);
+
 /// A result on its way to the file of a path, or to the console's standard output if IsStandardOutput(path). It takes no more
-/// memory than a TSpooledText, however long it is.
+/// memory than a TSpooledText, however long it is. If the name asks for it (CompressionOfName), it is compressed.
 ///
 /// Nothing of it is to be seen before Deliver. A file appears whole or not at all: what was there stays until the new text is on
 /// the disk. Links are followed and stay. A device, a pipe or an open descriptor (/dev/stdout) is written to, not replaced.
@@ -46,6 +52,7 @@ class TResultOutput {
     void Deliver(std::string_view end = std::string_view());
 
   private:
+    void Keep(std::string_view piece);
     void WriteToFile();
     void ForEachPiece(std::string_view end, const TSpooledText::TCallback& callback) const;
     void WriteTo(int descriptor, std::string_view end) const;
@@ -59,6 +66,7 @@ class TResultOutput {
     std::unique_ptr<TUnfinishedFile> fFile;  // if an ordinary file is to be replaced
     std::string fPiece;                      // what the file gets next
     TSpooledText fText;                      // the result if there is no fFile
+    std::unique_ptr<TCompressor> fCompressor;
 };
 
 /// Delivers a result that is at hand as a whole. Errors: those of TResultOutput.

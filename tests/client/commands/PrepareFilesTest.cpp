@@ -82,6 +82,19 @@ TEST_F(PrepareFilesTest, AnOutputThatCannotBeWrittenIsKnownBeforeInventoriesAreR
               Shell("show " + fSlow + " --output /dev/stdin < web01.xml"));
 }
 
+TEST_F(PrepareFilesTest, NamesOfCompressedFilesAreKnownBeforeInventoriesAreRead)
+{
+    EXPECT_EQ("cimdelta: F/r.bz2: found a name that ends in .bz2, expected .gz, .xz, .zst or no compression; give the file another "
+              "name\n",
+              Messages({"show", fSlow, "--output", fFolder / "r.bz2"}));
+    for (const char* const option : {"--accept", "--save-rules"}) {
+        EXPECT_EQ(
+            "cimdelta: F/r.gz: found a name for gzip, expected one for plain text, as which the file is to be read; give the file "
+            "another name\n",
+            Messages({"compare", fSlow, "web01.xml", option, fFolder / "r.gz"}));
+    }
+}
+
 TEST_F(PrepareFilesTest, AFolderThatIsReadOnlyIsKnownBeforeInventoriesAreRead)
 {
     if (geteuid() == 0) {
