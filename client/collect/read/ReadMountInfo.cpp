@@ -10,6 +10,7 @@
 
 #include "client/collect/read/TTextLines.h"
 #include "client/collect/read/TextPieces.h"
+#include "client/collect/read/WithoutPassword.h"
 #include "client/text/NumberIn.h"
 
 namespace NORVZEL20 {
@@ -32,10 +33,10 @@ std::string Unescaped(std::string_view text)
 std::vector<std::string> OptionsIn(std::string_view text)
 {
     std::vector<std::string> options;
-    for (const std::string& option : ListOf(text, ',')) {
+    for (const std::string_view option : SplitAt(text, ',')) {
         options.push_back(Unescaped(option));
     }
-    return options;
+    return WithoutPasswords(options);
 }
 
 }  // namespace
@@ -55,7 +56,7 @@ std::vector<TMount> ReadMountInfo(std::string_view text, TReadFaults& faults)
                        "found " + Quoted(lines.GetLine()) + ", expected a mount with its type, source and options");
             continue;
         }
-        mounts.push_back({Unescaped(fields[4]), Unescaped(hyphen[1]), Unescaped(hyphen[2]), Unescaped(fields[3]),
+        mounts.push_back({Unescaped(fields[4]), Unescaped(hyphen[1]), WithoutPassword(Unescaped(hyphen[2])), Unescaped(fields[3]),
                           OptionsIn(fields[5]), OptionsIn(hyphen[3])});
     }
     return mounts;
