@@ -66,20 +66,26 @@ void AddEndpoints(TCollection& collection, const std::string& protocol, const st
 
 void AddRoutes(TCollection& collection, const std::vector<TRoute>& routes)
 {
-    std::map<std::tuple<std::string, std::string, std::uint32_t>, std::vector<std::string>> nextHops;
+    struct TWays {
+        std::vector<std::string> nextHops;
+        bool isRefused = true;
+    };
+    std::map<std::tuple<std::string, std::string, std::uint32_t>, TWays> all;
     for (const TRoute& route : routes) {
-        std::vector<std::string>& list = nextHops[{route.network, route.interface, route.metric}];
+        TWays& ways = all[{route.network, route.interface, route.metric}];
+        ways.isRefused &= route.isRefused;
         if (!route.nextHop.empty()) {
-            list.push_back(route.nextHop);
+            ways.nextHops.push_back(route.nextHop);
         }
     }
-    for (auto& [key, list] : nextHops) {
-        std::sort(list.begin(), list.end());
+    for (auto& [key, ways] : all) {
+        std::sort(ways.nextHops.begin(), ways.nextHops.end());
         collection.Add(TFacts("KALMO_Route")
                            .Key("DestinationAddress", std::get<0>(key))
                            .Key("Adapter", std::get<1>(key))
                            .Number("Metric", std::get<2>(key))
-                           .Texts("NextHops", list));
+                           .Texts("NextHops", ways.nextHops)
+                           .Flag("Refused", ways.isRefused));
     }
 }
 

@@ -25,6 +25,7 @@ constexpr std::size_t kDigits6 = 32;
 constexpr std::uint64_t kAddressBits6 = 128;
 constexpr std::string_view kMulticast6 = "ff";
 
+constexpr std::string_view kNoInterface = "*";  // of IPv4; of IPv6 it is lo
 constexpr std::uint64_t kRouteIsUp = 0x1;
 constexpr std::uint64_t kRouteRefuses = 0x200;
 constexpr std::uint64_t kRouteIsCached = 0x01000000;
@@ -141,17 +142,28 @@ std::vector<TRoute> ReadRoutes4(std::string_view text, TReadFaults& faults)
         const std::uint64_t flags = row.Number(row.Field(3), UINT32_MAX);
         const std::uint64_t metric = row.Number(row.Field(6), UINT32_MAX, 10);
         const std::uint64_t mask = row.Number(row.Field(7), UINT32_MAX);
-        if (row.IsGood(lines.GetNumber(), "a route", faults) && (flags & kRouteIsUp) != 0 && (flags & kRouteRefuses) == 0) {
+        if (row.IsGood(lines.GetNumber(), "a route", faults) && (flags & kRouteIsUp) != 0) {
             routes.push_back({network + "/" + std::to_string(BitsOf(mask)), std::string(row.Field(0)),
-                              static_cast<std::uint32_t>(metric), UnlessZero(gateway)});
+                              static_cast<std::uint32_t>(metric), UnlessZero(gateway),
+                              (flags & kRouteRefuses) != 0 || row.Field(0) == kNoInterface});
         }
     }
     return routes;
 }
 
+namespace {
+
+// The table of IPv6 ends with a route that refuses everything and is no setting. Routes that refuse are not "up" there.
+bool IsSet(std::uint64_t flags, std::uint64_t metric)
+{
+    return (flags & kRouteRefuses) != 0 ? metric != UINT32_MAX : (flags & kRouteIsUp) != 0;
+}
+
+}  // namespace
+
 std::vector<TRoute> ReadRoutes6(std::string_view text, TReadFaults& faults)
 {
-    constexpr std::uint64_t kNotForOthers = kRouteRefuses | kRouteIsCached | kRouteIsLocal;
+    constexpr std::uint64_t kNotForOthers = kRouteIsCached | kRouteIsLocal;
     std::vector<TRoute> routes;
     TTextLines lines(text);
     while (lines.Next()) {
@@ -161,10 +173,10 @@ std::vector<TRoute> ReadRoutes6(std::string_view text, TReadFaults& faults)
         const std::string gateway = row.Address(row.Field(4), &AddressOfBytes);
         const std::uint64_t metric = row.Number(row.Field(5), UINT32_MAX);
         const std::uint64_t flags = row.Number(row.Field(8), UINT32_MAX);
-        if (row.IsGood(lines.GetNumber(), "a route", faults) && (flags & kRouteIsUp) != 0 && (flags & kNotForOthers) == 0 &&
-            !StartsWith(row.Field(0), kMulticast6)) {
+        if (row.IsGood(lines.GetNumber(), "a route", faults) && (flags & kNotForOthers) == 0 &&
+            !StartsWith(row.Field(0), kMulticast6) && IsSet(flags, metric)) {
             routes.push_back({network + "/" + std::to_string(length), std::string(row.Field(9)), static_cast<std::uint32_t>(metric),
-                              UnlessZero(gateway)});
+                              UnlessZero(gateway), (flags & kRouteRefuses) != 0});
         }
     }
     return routes;

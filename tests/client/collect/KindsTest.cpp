@@ -100,7 +100,8 @@ TEST_F(KindsTest, AdaptersHaveAddressesAndRoutes)
               "Adapter: lo, Protocol: IPv4, Addresses: {\"127.0.0.1/8\"}\n"
               "Adapter: eth0, Protocol: IPv6, Addresses: {\"2001:db8::5/64\"}\n",
               Lines("KALMO_IPEndpoint"));
-    EXPECT_EQ("DestinationAddress: 0.0.0.0/0, Adapter: eth0, Metric: 100, NextHops: {\"192.168.1.1\", \"192.168.1.2\"}\n",
+    EXPECT_EQ("DestinationAddress: 0.0.0.0/0, Adapter: eth0, Metric: 100, NextHops: {\"192.168.1.1\", \"192.168.1.2\"}, "
+              "Refused: FALSE\n",
               Lines("KALMO_Route"));
 }
 

@@ -16,7 +16,8 @@ std::string RoutesText(std::vector<TRoute> (*read)(std::string_view, TReadFaults
     TReadFaults faults;
     std::string text;
     for (const TRoute& route : read(table, faults)) {
-        text += route.network + " " + route.interface + " " + std::to_string(route.metric) + " " + route.nextHop + "\n";
+        text += route.network + " " + route.interface + " " + std::to_string(route.metric) + " " + route.nextHop +
+                (route.isRefused ? "refused" : "") + "\n";
     }
     return WithFaults(text, faults);
 }
@@ -38,11 +39,14 @@ TEST(NetworkTablesTest, RoutesHaveNetworkAndRouter)
 {
     EXPECT_EQ("0.0.0.0/0 eth0 100 192.168.1.1\n"
               "192.168.1.0/24 eth0 100 \n"
-              "1 bad: line 5: found \"eth0 0002A8C0 00000000 0001\", expected a route\n",
+              "10.0.0.0/8 * 0 refused\n"
+              "10.1.0.0/16 * 0 refused\n"
+              "1 bad: line 6: found \"eth0 0002A8C0 00000000 0001\", expected a route\n",
               RoutesText(&ReadRoutes4, "Iface\tDestination\tGateway \tFlags\tRefCnt\tUse\tMetric\tMask\t\tMTU\tWindow\tIRTT\n"
                                        "eth0\t00000000\t0101A8C0\t0003\t0\t0\t100\t00000000\t0\t0\t0\n"
                                        "eth0\t0001A8C0\t00000000\t0001\t0\t0\t100\t00FFFFFF\t0\t0\t0\n"
                                        "*\t0000000A\t00000000\t0201\t0\t0\t0\t000000FF\t0\t0\t0\n"
+                                       "*\t0000010A\t00000000\t0001\t0\t0\t0\t0000FFFF\t0\t0\t0\n"
                                        "eth0 0002A8C0 00000000 0001\n"));
 }
 
@@ -51,15 +55,17 @@ TEST(NetworkTablesTest, RoutesOfIPv6LeaveOutWhatTheKernelMakes)
     const std::string zero(32, '0');
     EXPECT_EQ("2001:db8::/64 eth0 256 \n"
               "::/0 eth0 1024 fe80::1\n"
-              "1 bad: line 6: found \"rubbish\", expected a route\n",
-              RoutesText(&ReadRoutes6, "20010db8000000000000000000000000 40 " + zero + " 00 " + zero +
-                                           " 00000100 00000001 00000000 00000001     eth0\n" + zero + " 00 " + zero +
-                                           " 00 fe800000000000000000000000000001 00000400 00000003 00000000 00000003     eth0\n" +
-                                           "20010db8000000000000000000000005 80 " + zero + " 00 " + zero +
-                                           " 00000000 00000002 00000000 80200001     eth0\n" +
-                                           "ff000000000000000000000000000000 08 " + zero + " 00 " + zero +
-                                           " 00000100 00000003 00000000 00000001     eth0\n" + zero + " 00 " + zero + " 00 " +
-                                           zero + " ffffffff 00000001 00000000 00200200       lo\n" + "rubbish\n"));
+              "2001:db8:1::/48 lo 1024 refused\n"
+              "1 bad: line 7: found \"rubbish\", expected a route\n",
+              RoutesText(&ReadRoutes6,
+                         "20010db8000000000000000000000000 40 " + zero + " 00 " + zero +
+                             " 00000100 00000001 00000000 00000001     eth0\n" + zero + " 00 " + zero +
+                             " 00 fe800000000000000000000000000001 00000400 00000003 00000000 00000003     eth0\n" +
+                             "20010db8000000000000000000000005 80 " + zero + " 00 " + zero +
+                             " 00000000 00000002 00000000 80200001     eth0\n" + "ff000000000000000000000000000000 08 " + zero +
+                             " 00 " + zero + " 00000100 00000003 00000000 00000001     eth0\n" + zero + " 00 " + zero + " 00 " +
+                             zero + " ffffffff 00000001 00000000 00200200       lo\n" + "20010db8000100000000000000000000 30 " +
+                             zero + " 00 " + zero + " 00000400 00000002 00000000 00200200       lo\n" + "rubbish\n"));
 }
 
 TEST(NetworkTablesTest, AddressesOfIPv6LeaveOutTemporaryAndLinkLocalOnes)
