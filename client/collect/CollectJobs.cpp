@@ -104,10 +104,10 @@ void AddScripts(TCollection& collection, TScheduledJobs& jobs, const std::string
 
 void AddTimers(TCollection& collection, TScheduledJobs& jobs)
 {
-    const TUnitFiles units(collection);
-    for (const auto& [name, unit] : units.GetUnits()) {
+    for (const auto& [name, unit] : collection.GetUnitFiles().GetUnits()) {
         // A template is no timer. Only one that is started with the system asks for its unit.
-        if (name.find("@.") != std::string::npos || unit.state == "disabled" || StartsWith(unit.state, "masked")) {
+        if (name.find("@.") != std::string::npos || unit.state == "disabled" || StartsWith(unit.state, "linked") ||
+            StartsWith(unit.state, "masked")) {
             continue;
         }
         for (const std::string& schedule : unit.file.schedules) {

@@ -138,7 +138,7 @@ void AddState(TFacts& facts, const TUnitState& state, bool isOnDemand)
 
 void CollectUnits(TCollection& collection)
 {
-    const TUnitFiles files(collection);
+    const TUnitFiles& files = collection.GetUnitFiles();
     const TUnitStateSource states(collection);
     const std::set<std::string> onDemand = UnitsOnDemand(files.GetUnits());
     for (const auto& [name, unit] : files.GetUnits()) {

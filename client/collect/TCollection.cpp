@@ -5,6 +5,7 @@
 #include <algorithm>
 #include <utility>
 
+#include "client/collect/TUnitFiles.h"
 #include "client/collect/read/TTextLines.h"
 #include "client/collect/read/TextPieces.h"
 #include "client/collect/read/ValidText.h"
@@ -93,6 +94,14 @@ std::string TCollection::ReadValue(const std::string& path) const
     const TFileText file = fRoot.Read(path);
     TTextLines lines(file.text);
     return lines.Next() ? std::string(Trimmed(lines.GetLine())) : std::string();
+}
+
+const TUnitFiles& TCollection::GetUnitFiles()
+{
+    if (!fUnitFiles) {
+        fUnitFiles = std::make_shared<const TUnitFiles>(*this);
+    }
+    return *fUnitFiles;
 }
 
 void TCollection::AddFrom(const std::string& path, TReader reader)

@@ -3,6 +3,7 @@
 #include <sys/stat.h>
 
 #include <cstddef>
+#include <memory>
 #include <optional>
 #include <string>
 #include <vector>
@@ -16,6 +17,8 @@
 #include "client/collect/read/TReadFaults.h"
 
 namespace NORVZEL20 {
+
+class TUnitFiles;
 
 /// One collection on its way: where facts come from, and where they go. The functions of CollectKinds.h share it.
 class TCollection {
@@ -63,6 +66,9 @@ class TCollection {
     /// Reads a file and writes what the reader makes of it.
     void AddFrom(const std::string& path, TReader reader);
 
+    /// The units' files, read when they are asked for first. Errors: TTimeIsUp.
+    const TUnitFiles& GetUnitFiles();
+
     /// Errors: TTimeIsUp.
     void CheckTime() const;
 
@@ -75,6 +81,7 @@ class TCollection {
     TInventoryWriter& fWriter;
     TOmissions fOmissions;
     std::string fKind;
+    std::shared_ptr<const TUnitFiles> fUnitFiles;
     std::chrono::steady_clock::time_point fEnd;
 };
 

@@ -13,8 +13,10 @@ struct TUnit {
     static constexpr char kTransient[] = "transient";
 
     TUnitFile file;
-    std::string path;   ///< of the file; empty if there is only a link to a template
-    std::string state;  ///< whether it is started with the system, in the words of UnitFileState
+    std::string path;       ///< of the file; empty if there is only a link to a template
+    std::string state;      ///< whether it is started with the system, in the words of UnitFileState; empty if it cannot be known
+    bool isRead = true;     ///< the file could be read
+    bool isLinked = false;  ///< the file is outside of the folders of units
     std::vector<std::string> dropIns;
 
     /// The unit that this one starts if it is a timer or a path of that name.

@@ -3,12 +3,15 @@
 // systemd looks for units in several folders; a file in an earlier one hides those of the same name. Links say the rest:
 //
 //   /etc/systemd/system/multi-user.target.wants/ssh.service    ssh.service is enabled
-//   /etc/systemd/system/sshd.service -> .../ssh.service        another name, and ssh.service is enabled
+//   /etc/systemd/system/sshd.service -> .../ssh.service        another name; ssh.service is enabled if it has Alias=sshd.service,
+//                                                              otherwise indirect
+//   .../getty.target.wants/getty@tty1.service                  likewise for getty@.service and DefaultInstance=tty1
+//   /etc/systemd/system/own.service -> /opt/own/own.service    own.service is linked
 //   /etc/systemd/system/cups.service -> /dev/null              cups.service is masked, as by an empty file
 //   /etc/systemd/system/ssh.service.d/port.conf                changes ssh.service
 //
-// Links in /run are enabled until the next start. A unit that is not enabled is disabled if its file says how it could be, and
-// static if not. An instance such as getty@tty1.service has the file of its template, getty@.service.
+// Links in /run are enabled until the next start. A unit of which no link speaks is disabled if its file says how it could be
+// enabled, and static if not. An instance such as getty@tty1.service has the file of its template, getty@.service.
 #include "client/collect/TUnitFiles.h"
 
 #include <algorithm>
@@ -36,6 +39,17 @@ std::string StateOfFolder(const std::string& folder)
         return TUnit::kTransient;
     }
     return StartsWith(folder, "/run/systemd/generator") ? "generated" : std::string();
+}
+
+// In other folders, links come with packages.
+bool IsForSettings(const std::string& folder)
+{
+    return folder == "/etc/systemd/system" || folder == "/run/systemd/system";
+}
+
+std::string FolderOf(const std::string& path)
+{
+    return path.substr(0, path.rfind('/'));
 }
 
 std::string StateInFolder(const std::string& folder, const std::string& state)
@@ -116,13 +130,22 @@ void TUnitFiles::TakeLink(const std::string& folder, const std::string& name, TU
     const std::string target = fCollection.GetRoot().ReadLink(unit.path).value_or(std::string());
     if (target == "/dev/null") {
         unit.state = StateInFolder(folder, "masked");
-    } else if (NameOf(target) != name && TemplateOf(name) != NameOf(target)) {
+        return;
+    }
+    TakeOtherName(folder, name, target);
+    if (NameOf(target) != name && TemplateOf(name) != NameOf(target)) {
         unit.state = "alias";
-        if (StartsWith(folder, "/etc/")) {
-            fEnabled.emplace(NameOf(target), "enabled");
-        }
-    } else {
-        TakeText(unit.path, unit);
+        return;
+    }
+    unit.isLinked = IsForSettings(folder) && StartsWith(target, "/") &&
+                    std::find(kUnitFolders.begin(), kUnitFolders.end(), FolderOf(target)) == kUnitFolders.end();
+    TakeText(unit.path, unit);
+}
+
+void TUnitFiles::TakeOtherName(const std::string& folder, const std::string& name, const std::string& target)
+{
+    if (IsForSettings(folder) && NameOf(target) != name) {
+        fOtherNames[NameOf(target)].emplace(name, StateInFolder(folder, "enabled"));
     }
 }
 
@@ -130,6 +153,7 @@ void TUnitFiles::TakeText(const std::string& path, TUnit& unit)
 {
     const std::optional<std::string> text = fCollection.Read(path);
     if (!text) {
+        unit.isRead = false;
         return;
     }
     if (text->empty()) {
@@ -140,12 +164,15 @@ void TUnitFiles::TakeText(const std::string& path, TUnit& unit)
 
 void TUnitFiles::TakeEnabled(const std::string& folder, const std::string& subfolder)
 {
-    if (folder != "/etc/systemd/system" && folder != "/run/systemd/system") {
-        return;  // what a package links is static
+    if (!IsForSettings(folder)) {
+        return;
     }
     for (const TFolderEntry& entry : fCollection.GetRoot().List(folder + "/" + subfolder)) {
         if (IsUnitName(entry.name)) {
             fEnabled.emplace(entry.name, StateInFolder(folder, "enabled"));
+            if (const std::string pattern = TemplateOf(entry.name); !pattern.empty()) {
+                TakeOtherName(folder, entry.name, pattern);
+            }
         }
     }
 }
@@ -179,17 +206,39 @@ void TUnitFiles::FinishUnit(const std::string& name, TUnit& unit)
             ReadUnitFile(*text, unit.file);
         }
     }
-    if (!unit.state.empty()) {
-        return;
+    if (unit.state.empty()) {
+        unit.state = StateByLinks(name, unit);
     }
+    if (unit.state.empty() && unit.isRead) {
+        const char* const uninstalled = unit.file.isInstalledByOthers ? "indirect" : "static";
+        unit.state = unit.file.isInstalled ? "disabled" : uninstalled;
+    }
+}
+
+// Empty if no link speaks of the unit.
+std::string TUnitFiles::StateByLinks(const std::string& name, const TUnit& unit) const
+{
     const auto enabled = fEnabled.find(name);
     if (enabled != fEnabled.end()) {
-        unit.state = enabled->second;
-    } else if (unit.file.isInstalled) {
-        unit.state = "disabled";
-    } else {
-        unit.state = unit.file.isInstalledByOthers ? "indirect" : "static";
+        return enabled->second;
     }
+    const auto others = fOtherNames.find(name);
+    if (others != fOtherNames.end()) {
+        const std::string instance = name.substr(0, name.find('@') + 1) + unit.file.defaultInstance + name.substr(name.rfind('.'));
+        for (const auto& [link, state] : others->second) {
+            const bool isAlias = std::find(unit.file.aliases.begin(), unit.file.aliases.end(), link) != unit.file.aliases.end();
+            if (isAlias || (!unit.file.defaultInstance.empty() && link == instance)) {
+                return state;
+            }
+        }
+    }
+    if (!unit.isRead) {
+        return std::string();
+    }
+    if (unit.isLinked) {
+        return StateInFolder(unit.path, "linked");
+    }
+    return others == fOtherNames.end() ? std::string() : "indirect";
 }
 
 }  // namespace NORVZEL20

@@ -24,15 +24,19 @@ class TUnitFiles {
     void TakeFolder(const std::string& folder);
     void TakeUnit(const std::string& folder, const TFolderEntry& entry);
     void TakeLink(const std::string& folder, const std::string& name, TUnit& unit);
+    void TakeOtherName(const std::string& folder, const std::string& name, const std::string& target);
     void TakeText(const std::string& path, TUnit& unit);
     void TakeEnabled(const std::string& folder, const std::string& subfolder);
     void TakeDropIns(const std::string& folder, const std::string& subfolder);
     void AddEnabledInstances();
     void FinishUnit(const std::string& name, TUnit& unit);
+    std::string StateByLinks(const std::string& name, const TUnit& unit) const;
 
     TCollection& fCollection;
     std::map<std::string, TUnit> fUnits;
-    std::map<std::string, std::string> fEnabled;                         // the state by the names that are linked
+    std::map<std::string, std::string> fEnabled;  // the state by the names that are linked
+    // Links that lead to a unit by another name: name of the unit, name of the link, state.
+    std::map<std::string, std::map<std::string, std::string>> fOtherNames;
     std::map<std::string, std::map<std::string, std::string>> fDropIns;  // unit, name of the file, path
 };
 

@@ -28,8 +28,15 @@ void TakeTimerValue(std::string_view name, std::string_view value, TUnitFile& un
     }
 }
 
-void TakeInstallValue(std::string_view name, TUnitFile& unit)
+void TakeInstallValue(std::string_view name, std::string_view value, TUnitFile& unit)
 {
+    if (name == "Alias") {
+        for (const std::string_view alias : SplitAtBlanks(value)) {
+            unit.aliases.emplace_back(alias);
+        }
+    } else if (name == "DefaultInstance") {
+        unit.defaultInstance = std::string(value);
+    }
     unit.isInstalled |= name == "WantedBy" || name == "RequiredBy" || name == "UpheldBy" || name == "Alias";
     unit.isInstalledByOthers |= name == "Also";
 }
@@ -45,7 +52,7 @@ void TakeUnitValue(std::string_view section, std::string_view name, std::string_
     } else if (section == "[Timer]") {
         TakeTimerValue(name, value, unit);
     } else if (section == "[Install]" && !value.empty()) {
-        TakeInstallValue(name, unit);
+        TakeInstallValue(name, value, unit);
     }
 }
 

@@ -11,6 +11,8 @@ struct TUnitFile {
     std::string type;                    ///< of a service: simple, oneshot, dbus ...
     std::string activated;               ///< the unit that a timer or path starts, if the file names one
     std::vector<std::string> schedules;  ///< of a timer: OnCalendar=daily
+    std::vector<std::string> aliases;    ///< other names by which it may be enabled
+    std::string defaultInstance;         ///< of a template: "tty1"
     bool isInstalled = false;            ///< the file says by which units it may be enabled
     bool isInstalledByOthers = false;    ///< the file names others that are enabled in its place
 };

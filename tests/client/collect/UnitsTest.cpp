@@ -35,6 +35,7 @@ TEST_F(UnitsTest, FilesAndLinksDecideWhetherAUnitIsEnabled)
     Unit(lib + "d-empty.service", installed).File("/run/systemd/system/d-empty.service", "");
     Unit(lib + "e@.service", installed).Link(etc + "getty.target.wants/e@tty1.service", lib + "e@.service");
     Unit(lib + "f.service", installed).Link(etc + "f-alias.service", lib + "f.service");
+    Unit(lib + "f2.service", installed + "Alias=f3.service f4.service\n").Link(etc + "f4.service", lib + "f2.service");
     Unit(lib + "g.service", installed).Link("/run/systemd/system/x.target.requires/g.service", lib + "g.service");
     Unit("/run/systemd/generator/h.service", "[Service]\n");
     Unit(lib + "i.service", "[Install]\nAlso=f.service\n");
@@ -43,15 +44,64 @@ TEST_F(UnitsTest, FilesAndLinksDecideWhetherAUnitIsEnabled)
               "b-static.service static inactive\n"
               "c-masked.service masked inactive\n"
               "d-empty.service masked-runtime inactive\n"
-              "e@.service disabled NULL\n"
+              "e@.service indirect NULL\n"
               "e@tty1.service enabled inactive\n"
               "f-alias.service alias NULL\n"
-              "f.service enabled inactive\n"
+              "f.service indirect inactive\n"
+              "f2.service enabled inactive\n"
+              "f4.service alias NULL\n"
               "g.service enabled-runtime inactive\n"
               "h.service generated inactive\n"
               "i.service indirect inactive\n"
               "ssh.service enabled active\n",
               States());
+}
+
+/// As "systemctl list-unit-files" says it of the same files.
+TEST_F(UnitsTest, TemplatesAndLinkedFilesHaveTheStatesOfSystemd)
+{
+    const std::string lib = "/usr/lib/systemd/system/";
+    const std::string etc = "/etc/systemd/system/";
+    const std::string wants = etc + "multi-user.target.wants/";
+    const std::string installed = "[Install]\nWantedBy=multi-user.target\n";
+    const std::string first = installed + "DefaultInstance=tty1\n";
+    Unit(lib + "d@.service", first).Link(wants + "d@tty1.service", lib + "d@.service");
+    Unit(lib + "dd@.service", first).Link(wants + "dd@tty2.service", lib + "dd@.service");
+    Unit(lib + "s@.service", "[Service]\n").Link(wants + "s@tty2.service", lib + "s@.service");
+    Unit(lib + "la.service", "[Service]\n").Link(lib + "la-alias.service", "la.service");
+    Unit(lib + "w.service", installed).Link(wants + "other.service", lib + "w.service");
+    Unit("/opt/x/le.service", installed)
+        .Link(etc + "le.service", "/opt/x/le.service")
+        .Link(wants + "le.service", "/opt/x/le.service");
+    Unit("/opt/x/lk.service", installed).Link(etc + "lk.service", "/opt/x/lk.service");
+    Unit("/opt/x/ls.service", "")
+        .Link("/run/systemd/system/ls.service", "/opt/x/ls.service")
+        .Append("/opt/x/ls.service", "[Unit]\n");
+    EXPECT_EQ("d@.service enabled NULL\n"
+              "d@tty1.service enabled inactive\n"
+              "dd@.service indirect NULL\n"
+              "dd@tty2.service enabled inactive\n"
+              "la-alias.service alias NULL\n"
+              "la.service static inactive\n"
+              "le.service enabled inactive\n"
+              "lk.service linked inactive\n"
+              "ls.service linked-runtime inactive\n"
+              "s@.service indirect NULL\n"
+              "s@tty2.service enabled inactive\n"
+              "ssh.service enabled active\n"
+              "w.service disabled inactive\n",
+              States());
+}
+
+TEST_F(UnitsTest, UnitWhoseFileCannotBeReadHasNoStateOfItsFile)
+{
+    fSystem->Link("/etc/systemd/system/gone.service", "/opt/gone/gone.service");
+    fSystem->Link("/etc/systemd/system/on.service", "/opt/gone/on.service");
+    fSystem->Link("/etc/systemd/system/multi-user.target.wants/on.service", "/opt/gone/on.service");
+    EXPECT_EQ("gone.service NULL inactive\non.service enabled inactive\nssh.service enabled active\n", States());
+    EXPECT_EQ("not collected: files: /etc/shadow: it may hold keys or passwords\n"
+              "not collected: units: /etc/systemd/system/gone.service, /etc/systemd/system/on.service: No such file or directory\n",
+              fLines);
 }
 
 TEST_F(UnitsTest, UnitsOnDemandHaveAStateOnlyIfTheyFailed)
