@@ -5,8 +5,8 @@
 //   -----END CERTIFICATE-----
 //
 // Other blocks, private keys among them, are never decoded. A file without such a line is taken for DER if it begins as a
-// certificate does. The certificates in a file are counted, so a renewed one, or one of another name, is a change of the one
-// before.
+// certificate does. A certificate is known by its file and its subject, so a renewed one is a change of the one before, and one
+// more in a file of authorities is that one alone. Those with the same subject in a file are counted.
 #include "client/collect/read/ReadCertificates.h"
 
 #include <arpa/inet.h>
@@ -20,6 +20,7 @@
 #include <boost/algorithm/hex.hpp>
 #include <ctime>
 #include <iterator>
+#include <map>
 #include <memory>
 #include <new>
 #include <optional>
@@ -114,12 +115,12 @@ void AddTime(TFacts& facts, const char* property, const ASN1_TIME* time)
     }
 }
 
-TFacts FactsOf(const X509& certificate, const std::string& path, std::uint16_t number)
+TFacts FactsOf(const X509& certificate, const std::string& path, const std::string& subject, std::uint16_t number)
 {
     TFacts facts("KALMO_Certificate");
     facts.Key("Path", path)
+        .Key("Subject", subject)
         .Number("Number", number)
-        .Text("Subject", TextOf(X509_get_subject_name(&certificate)))
         .Text("Issuer", TextOf(X509_get_issuer_name(&certificate)))
         .Text("SerialNumber", SerialOf(certificate))
         .Text("Fingerprint", FingerprintOf(certificate))
@@ -171,8 +172,10 @@ class TCertificateList {
 
     void Add(const X509& certificate)
     {
-        if (fNumber < UINT16_MAX) {
-            fFacts.push_back(FactsOf(certificate, fPath, ++fNumber));
+        const std::string subject = TextOf(X509_get_subject_name(&certificate));
+        std::uint16_t& number = fNumbers[subject];
+        if (number < UINT16_MAX) {
+            fFacts.push_back(FactsOf(certificate, fPath, subject, ++number));
         }
     }
 
@@ -180,7 +183,7 @@ class TCertificateList {
 
   private:
     const std::string& fPath;
-    std::uint16_t fNumber = 0;
+    std::map<std::string, std::uint16_t> fNumbers;  // of the certificates with a subject
     std::vector<TFacts> fFacts;
 };
 
