@@ -8,6 +8,7 @@
 #include <sqlite3.h>
 
 #include <memory>
+#include <utility>
 
 #include "client/collect/read/ReadRpmHeader.h"
 
@@ -69,6 +70,16 @@ void ReadHeaders(TCollection& collection, const std::string& path, sqlite3* data
     }
 }
 
+void NoteOtherForms(TCollection& collection, const std::string& folder)
+{
+    for (const auto& [name, form] : {std::pair("Packages", "Berkeley DB"), std::pair("Packages.db", "ndb")}) {
+        if (collection.GetRoot().Look(folder + name)) {
+            collection.LeaveOut(folder + name, "found a database of rpm in the form of " + std::string(form) + ", expected SQLite",
+                                "rpm 4.16 or later turns it into one with rpmdb --rebuilddb --define '_db_backend sqlite'");
+        }
+    }
+}
+
 }  // namespace
 
 std::vector<TRpmPackage> ReadRpmDatabase(TCollection& collection)
@@ -81,11 +92,7 @@ std::vector<TRpmPackage> ReadRpmDatabase(TCollection& collection)
         }
         const std::string path = folder + "rpmdb.sqlite";
         if (!root.Look(path)) {
-            for (const char* const old : {"Packages", "Packages.db"}) {
-                if (root.Look(folder + old)) {
-                    collection.LeaveOut(folder + old, "found a database of rpm in another form than SQLite, expected rpmdb.sqlite");
-                }
-            }
+            NoteOtherForms(collection, folder);
             continue;
         }
         std::string trouble;

@@ -68,6 +68,8 @@ void AddPackage(std::vector<TFacts>& packages, const TDpkgParagraph& paragraph, 
         faults.Add(paragraph.line, "found no version or no architecture of " + std::string(paragraph.name) + ", expected both");
         return;
     }
+    // "e2fsprogs (1.47.0-2)" if it was built anew from the source of that version.
+    const std::string_view source = paragraph.source.substr(0, paragraph.source.find(' '));
     packages.push_back(TFacts("KALMO_Package")
                            .Key("Name", paragraph.name)
                            .Key("Architecture", paragraph.architecture)
@@ -76,7 +78,7 @@ void AddPackage(std::vector<TFacts>& packages, const TDpkgParagraph& paragraph, 
                            .Text("State", status[1] == "ok" ? std::string(status[2])
                                                             : std::string(status[2]) + " (" + std::string(status[1]) + ")")
                            .Text("Selection", status[0])
-                           .Text("Source", paragraph.source.substr(0, paragraph.source.find(' '))));
+                           .Text("Source", source == paragraph.name ? std::string_view() : source));
 }
 
 }  // namespace

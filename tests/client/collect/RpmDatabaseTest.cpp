@@ -142,7 +142,11 @@ TEST_F(RpmDatabaseTest, OtherFormsAreNamed)
 {
     fSystem->Unlink(kDatabase);
     fSystem->File("/var/lib/rpm/Packages.db", "RpmP");
-    EXPECT_EQ("/var/lib/rpm/Packages.db: found a database of rpm in another form than SQLite, expected rpmdb.sqlite",
+    const std::string advice = " (rpm 4.16 or later turns it into one with rpmdb --rebuilddb --define '_db_backend sqlite')";
+    EXPECT_EQ("/var/lib/rpm/Packages.db: found a database of rpm in the form of ndb, expected SQLite" + advice, PackagesLine());
+    fSystem->Unlink("/var/lib/rpm/Packages.db");
+    fSystem->File("/var/lib/rpm/Packages", "");
+    EXPECT_EQ("/var/lib/rpm/Packages: found a database of rpm in the form of Berkeley DB, expected SQLite" + advice,
               PackagesLine());
 }
 
