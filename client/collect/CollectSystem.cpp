@@ -43,16 +43,30 @@ std::optional<std::uint64_t> BootTime(const TCollection& collection)
     return NumberIn(std::string_view(text).substr(begin, text.find('\n', begin) - begin));
 }
 
+// What the distribution says of itself; empty if there is no such file.
+std::string ReleaseText(TCollection& collection)
+{
+    const std::string usual = "/etc/os-release";
+    bool isThere = false;
+    for (const std::string& path : {usual, std::string("/usr/lib/os-release")}) {
+        const TFileText file = collection.GetRoot().Read(path);
+        if (file.trouble.empty()) {
+            return file.text;
+        }
+        if (!file.isMissing) {
+            isThere = true;
+            collection.LeaveOut(path, file.trouble);
+        }
+    }
+    if (!isThere) {
+        collection.LeaveOut(usual, "No such file or directory");
+    }
+    return std::string();
+}
+
 TFacts OperatingSystem(TCollection& collection)
 {
-    std::optional<std::string> text = collection.ReadIfThere("/etc/os-release");
-    if (!text) {
-        text = collection.ReadIfThere("/usr/lib/os-release");
-    }
-    if (!text) {
-        collection.LeaveOut("/etc/os-release", "No such file or directory");
-    }
-    const std::map<std::string, std::string> release = ReadOsRelease(text.value_or(std::string()));
+    const std::map<std::string, std::string> release = ReadOsRelease(ReleaseText(collection));
     const auto value = [&release](const char* name) {
         const auto found = release.find(name);
         return found == release.end() ? std::string() : found->second;

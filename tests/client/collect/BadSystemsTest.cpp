@@ -118,6 +118,69 @@ TEST_F(BadSystemsTest, PipesLoopsAndOddNamesInEtcAreNotOpened)
     EXPECT_EQ("/etc/shadow: it may hold keys or passwords\n", LinesAbout("files"));
 }
 
+/// Each of them is passed over at once, with a line.
+TEST_F(BadSystemsTest, WhatIsNoFileIsNamed)
+{
+    const struct {
+        const char* path;
+        const char* kind;
+    } rows[] = {
+        {"/proc/self/mountinfo", "mounts"}, {"/proc/cpuinfo", "processors"},      {"/proc/meminfo", "memory"},
+        {"/proc/net/route", "network"},     {"/var/lib/dpkg/status", "packages"}, {"/etc/passwd", "users"},
+        {"/etc/crontab", "jobs"},           {"/etc/cron.d/tidy", "jobs"},         {"/etc/systemd/system/a.service", "units"},
+        {"/etc/os-release", "system"},
+    };
+    for (const auto& row : rows) {
+        for (const mode_t kind : {S_IFIFO, S_IFSOCK}) {
+            SetUpSystem();
+            fSystem->Special(row.path, kind);
+            EXPECT_EQ(std::string(row.path) + ": it is no ordinary file\n", LinesAbout(row.kind));
+        }
+        SetUpSystem();
+        std::filesystem::remove(fSystem->Place(row.path));
+        fSystem->Link(row.path, row.path);
+        EXPECT_EQ(std::string(row.path) + ": Too many levels of symbolic links\n", LinesAbout(row.kind)) << row.path;
+    }
+}
+
+TEST_F(BadSystemsTest, DevicesInEtcAreNotOpened)
+{
+    if (geteuid() != 0) {
+        GTEST_SKIP() << "only root can make a device";
+    }
+    fSystem->Special("/etc/device", S_IFCHR).Special("/etc/ssl/device.pem", S_IFBLK);
+    EXPECT_NE(std::string::npos, Show("KALMO_ConfigurationFile").find("Name: /etc/device\n    Type: device\n    Digest: NULL\n"));
+    EXPECT_EQ("not collected: files: /etc/shadow: it may hold keys or passwords\n", fLines);
+}
+
+TEST_F(BadSystemsTest, LongFilesAreLeftOut)
+{
+    fSystem->LongFile("/etc/ssl/bundle.pem", 50U << 20U).LongFile("/etc/huge.img", 65U << 20U);
+    fSystem->LongFile("/var/lib/dpkg/status", std::uintmax_t{1} << 40U);
+    EXPECT_EQ("/etc/huge.img: it has more than 64 MiB; /etc/shadow: it may hold keys or passwords\n", LinesAbout("files"));
+    EXPECT_EQ("/etc/ssl/bundle.pem: it has more than 16 MiB\n", LinesAbout("certificates"));
+    EXPECT_EQ("/var/lib/dpkg/status: it has more than 64 MiB\n", LinesAbout("packages"));
+}
+
+TEST_F(BadSystemsTest, FoldersWithTooManyFilesAreLeftOut)
+{
+    for (std::size_t i = 0; i <= TSystemRoot::kMostEntries; ++i) {
+        ASSERT_EQ(0, symlink("x", fSystem->Place("/etc/ssh/" + std::to_string(i)).c_str()));
+    }
+    EXPECT_EQ("/etc/ssh: it has more than 100000 names; /etc/shadow: it may hold keys or passwords\n", LinesAbout("files"));
+    EXPECT_EQ("/etc/ssh: it has more than 100000 names\n", LinesAbout("certificates"));
+}
+
+/// Values of the kernel that are missing, empty or cut are NULL.
+TEST_F(BadSystemsTest, ValuesThatEndEarlyAreNull)
+{
+    fSystem->File("/sys/block/sda/size", "").File("/sys/block/sda/ro", "").File("/sys/class/net/eth0/flags", "0x");
+    fSystem->File("/sys/class/net/eth0/mtu", "");
+    EXPECT_NE(std::string::npos, Show("KALMO_Disk").find("    Size: NULL\n    ReadOnly: NULL\n"));
+    EXPECT_NE(std::string::npos, Show("KALMO_NetworkAdapter").find("    MaximumTransmissionUnit: NULL\n    Enabled: NULL\n"));
+    EXPECT_EQ("not collected: files: /etc/shadow: it may hold keys or passwords\n", fLines);
+}
+
 TEST_F(BadSystemsTest, FileSystemsOfOtherSystemsAreNotEntered)
 {
     fSystem->File("/etc/shared/a", "").Append("/proc/self/mountinfo", "31 25 0:27 / /etc/shared rw - nfs4 nas:/etc rw\n");

@@ -78,6 +78,23 @@ class TMadeSystem {
         return Append("/var/lib/dpkg/status", Package(name, version));
     }
 
+    /// Makes or replaces a pipe, a socket or a device.
+    TMadeSystem& Special(const std::string& path, mode_t kind)
+    {
+        std::filesystem::create_directories(std::filesystem::path(Place(path)).parent_path());
+        unlink(Place(path).c_str());
+        EXPECT_EQ(0, mknod(Place(path).c_str(), kind | 0644, 0));
+        return *this;
+    }
+
+    /// Makes or replaces a file of that many bytes of zero, which takes no room.
+    TMadeSystem& LongFile(const std::string& path, std::uintmax_t bytes)
+    {
+        File(path, "");
+        std::filesystem::resize_file(Place(path), bytes);
+        return *this;
+    }
+
     void Unlink(const std::string& path) { EXPECT_EQ(0, unlink(Place(path).c_str())); }
 
     void RemoveFolder(const std::string& path) { EXPECT_EQ(0, rmdir(Place(path).c_str())); }
