@@ -6,10 +6,14 @@ namespace NORVZEL20 {
 
 namespace {
 
-bool IsLeftOut(const TCoverage::TClass& cls, const std::string& property)
+bool IsBefore(const TAcceptedDifference::TValue& one, const TAcceptedDifference::TValue& other)
 {
-    return std::any_of(cls.leftOut.begin(), cls.leftOut.end(),
-                       [&](const TCoverage::TLeftOut& leftOut) { return leftOut.property == property; });
+    return one.property < other.property;
+}
+
+std::string ClassOf(const TAcceptedDifference& entry)
+{
+    return entry.instance.substr(0, entry.instance.find('.'));
 }
 
 }  // namespace
@@ -24,39 +28,48 @@ TAcceptance::TVerdict TAcceptance::Judge(const TDifference& difference, const TD
     }
     const std::vector<TAcceptedDifference::TValue>& accepted = fBaseline->GetEntries()[*verdict.entry].values;
     verdict.present = states.ValuesOf(inventory);
-    if (accepted == verdict.present) {
-        verdict.isAccepted = true;
-        return verdict;
+    if (difference.kind == TDifference::kOnlyInOthers && accepted != verdict.present) {
+        const TNames& compared = ComparedOf(difference.className);
+        std::copy_if(accepted.begin(), accepted.end(), std::back_inserter(verdict.present),
+                     [&compared](const TAcceptedDifference::TValue& value) {
+                         return value.property != kInstancesMark && compared.count(value.property) == 0;
+                     });
+        std::sort(verdict.present.begin(), verdict.present.end(), &IsBefore);
     }
-    const TCoverage::TClass* const cls = FindClass(difference.className);
-    std::vector<TAcceptedDifference::TValue> compared;
-    std::copy_if(accepted.begin(), accepted.end(), std::back_inserter(compared),
-                 [cls](const TAcceptedDifference::TValue& value) { return cls == nullptr || !IsLeftOut(*cls, value.property); });
-    verdict.isAccepted = compared == verdict.present;
+    verdict.isAccepted = accepted == verdict.present;
     return verdict;
 }
 
 bool TAcceptance::IsCompared(const TAcceptedDifference& entry) const
 {
-    const TCoverage::TClass* const cls = FindClass(entry.instance.substr(0, entry.instance.find('.')));
-    if (cls == nullptr) {
-        return true;  // no inventory has an instance of it
+    const TNames& compared = ComparedOf(ClassOf(entry));
+    return entry.kind == TDifference::kChanged ? compared.count(entry.values.front().property) > 0 : !compared.empty();
+}
+
+const TAcceptance::TNames& TAcceptance::ComparedOf(const std::string& className) const
+{
+    const auto known = fCompared.find(className);
+    return known != fCompared.end() ? known->second : fCompared.emplace(className, FindCompared(className)).first->second;
+}
+
+// Instances are compared in the classes of the reference. A class without instances anywhere has no coverage, and is compared if
+// the rules say so.
+TAcceptance::TNames TAcceptance::FindCompared(const std::string& className) const
+{
+    const boost::shared_ptr<TInMemClass> declared = GetReference().ns->FindClass(className);
+    const std::vector<TCoverage::TClass>& classes = fReport.coverage.classes;
+    const auto covered =
+        std::find_if(classes.begin(), classes.end(), [&](const TCoverage::TClass& cls) { return cls.name == className; });
+    if (!declared || (covered != classes.end() && covered->state != TCoverage::kCompared)) {
+        return TNames();
     }
-    return cls->state == TCoverage::kCompared &&
-           (entry.kind != TDifference::kChanged || !IsLeftOut(*cls, entry.values.front().property));
+    const std::vector<std::string> compared = fReport.meaning->PropertiesOf(declared);
+    return TNames(compared.begin(), compared.end());
 }
 
 bool TAcceptance::IsOther(const std::string& label) const
 {
     return std::find(fReport.labels.begin() + 1, fReport.labels.end(), label) != fReport.labels.end();
-}
-
-const TCoverage::TClass* TAcceptance::FindClass(const std::string& name) const
-{
-    const std::vector<TCoverage::TClass>& classes = fReport.coverage.classes;
-    const auto found = std::lower_bound(classes.begin(), classes.end(), name,
-                                        [](const TCoverage::TClass& cls, const std::string& wanted) { return cls.name < wanted; });
-    return found != classes.end() && found->name == name ? &*found : nullptr;
 }
 
 }  // namespace NORVZEL20

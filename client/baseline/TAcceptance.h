@@ -1,7 +1,9 @@
 #pragma once
 
+#include <map>
 #include <memory>
 #include <optional>
+#include <set>
 #include <string>
 #include <vector>
 
@@ -11,13 +13,14 @@
 
 namespace NORVZEL20 {
 
-/// What a baseline means for the inventories of a run.
+/// What a baseline means for the inventories of a run. Threads: one at a time.
 class TAcceptance {
   public:
     struct TVerdict {
         bool isAccepted = false;
         std::optional<std::size_t> entry;                  ///< for that inventory, whatever its values
-        std::vector<TAcceptedDifference::TValue> present;  ///< what the inventory has, if there is an entry
+        std::vector<TAcceptedDifference::TValue> present;  ///< if there is an entry: what the inventory has, and otherwise what the
+                                                           ///< entry says of properties that were not compared
     };
 
     /// The report must outlive this.
@@ -30,17 +33,24 @@ class TAcceptance {
     const std::string& LabelOf(std::size_t inventory) const { return fReport.labels[inventory]; }
 
     /// Whether the difference is accepted for one of its inventories. Contents that this run does not compare do not count.
+    /// Errors: those of TRules.
     TVerdict Judge(const TDifference& difference, const TDifferenceStates& states, std::size_t inventory) const;
-    /// Whether the run compared what the entry is about: if so and there is no such difference, it is gone.
+    /// Whether the run compared what the entry is about: if so and there is no such difference, it is gone. Errors: those of
+    /// TRules.
     bool IsCompared(const TAcceptedDifference& entry) const;
     /// Whether one of the other inventories has that label.
     bool IsOther(const std::string& label) const;
+    bool IsReference(const std::string& label) const { return fReport.labels.front() == label; }
 
   private:
-    const TCoverage::TClass* FindClass(const std::string& name) const;
+    using TNames = std::set<std::string>;
+
+    const TNames& ComparedOf(const std::string& className) const;
+    TNames FindCompared(const std::string& className) const;
 
     const std::shared_ptr<const TBaseline> fBaseline;
     const TComparisonReport& fReport;
+    mutable std::map<std::string, TNames> fCompared;  // the properties of each class that was asked for
 };
 
 }  // namespace NORVZEL20

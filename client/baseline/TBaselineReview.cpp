@@ -1,6 +1,6 @@
 // (1) Each difference is judged for each of its inventories: accepted, new, or accepted with another value.
 // (2) What is left of the baseline's entries then was not found. It is gone, unless the run could not find it: because no inventory
-//     has that label, or because the class or the property was not compared. Such entries stay.
+//     has that label, because the reference has it, or because the class or the property was not compared. Such entries stay.
 #include "client/baseline/TBaselineReview.h"
 
 #include <algorithm>
@@ -93,11 +93,14 @@ void TBaselineReview::SortOut()
         std::vector<std::string> gone;
         std::vector<std::string> notCompared;
         bool isOfAbsent = false;
+        bool isOfReference = false;
         for (const std::string& label : entries[i].inventories) {
             if (Has(fKept[i], label) || Has(fReplaced[i], label)) {
                 continue;
             }
-            if (!fAcceptance.IsOther(label)) {
+            if (fAcceptance.IsReference(label)) {
+                isOfReference = true;
+            } else if (!fAcceptance.IsOther(label)) {
                 isOfAbsent = true;
                 fOutcome.absent.push_back(label);
             } else {
@@ -108,6 +111,7 @@ void TBaselineReview::SortOut()
             }
         }
         fOutcome.ofAbsent += isOfAbsent ? 1 : 0;
+        fOutcome.ofReference += isOfReference ? 1 : 0;
         if (!gone.empty()) {
             fOutcome.gone.push_back(WithLabels(entries[i], std::move(gone)));
         }

@@ -76,7 +76,7 @@ std::vector<TAcceptedDifference::TValue> TDifferenceStates::ContentsOf(std::size
         contents[disagreement.property] = ValueOf(inventory, disagreement);
     }
     if (const std::size_t sharing = fDifference.CountSharing(inventory); sharing > 0) {
-        contents["(instances)"] = std::to_string(sharing);
+        contents[kInstancesMark] = std::to_string(sharing);
     }
     std::vector<TAcceptedDifference::TValue> values;
     for (auto& [property, text] : contents) {

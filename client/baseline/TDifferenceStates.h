@@ -8,6 +8,9 @@
 
 namespace NORVZEL20 {
 
+/// What stands in the place of a property before the number of instances that share a key.
+inline constexpr char kInstancesMark[] = "(instances)";
+
 /// A difference as a baseline sees it: what it is about, and the state of each inventory concerned.
 class TDifferenceStates {
   public:

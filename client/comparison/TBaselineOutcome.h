@@ -13,7 +13,8 @@ struct TBaselineOutcome {
     /// An accepted difference that is another one now.
     struct TChanged {
         TAcceptedDifference accepted;
-        TAcceptedDifference present;  ///< the same inventories; of kOnlyInOthers all values
+        TAcceptedDifference
+            present;  ///< the same inventories; of kOnlyInOthers all values, those that were not compared as accepted
     };
 
     std::string file;
@@ -26,6 +27,7 @@ struct TBaselineOutcome {
     std::vector<TAcceptedDifference> notCompared;  ///< those whose class or property was not compared in this run
     std::vector<std::string> absent;               ///< labels in the baseline that no other inventory of the run has, ascending
     std::size_t ofAbsent = 0;                      ///< how many entries are for them
+    std::size_t ofReference = 0;                   ///< how many entries are for the inventory that is the reference in this run
 };
 
 }  // namespace NORVZEL20

@@ -4,6 +4,7 @@
 //     changed  ~ INV_Package.Name="bash" Version: "5.1" -> "5.3" in web02; accepted: "5.1" -> "5.2"
 //     gone     + INV_Package.Name="curl" in web03
 //   2 accepted differences are for inventories that are not in this run: web09
+//   1 accepted difference is for web01, which is the reference in this run
 //   1 accepted difference is for what was not compared: ~ INV_Disk.Id="sda" Size in web02
 #include "client/report/BaselineText.h"
 
@@ -150,6 +151,10 @@ std::string WriteBaselineText(const TComparisonReport& report, const TTextOption
         }
         lines.Add(Counted(outcome.ofAbsent, "accepted difference is", "accepted differences are") +
                   " for inventories that are not in this run: " + SomeOf(labels));
+    }
+    if (outcome.ofReference > 0) {
+        lines.Add(Counted(outcome.ofReference, "accepted difference is", "accepted differences are") + " for " +
+                  DisplayLabel(report.labels.front()) + ", which is the reference in this run");
     }
     if (!outcome.notCompared.empty()) {
         lines.Add(Counted(outcome.notCompared.size(), "accepted difference is", "accepted differences are") +

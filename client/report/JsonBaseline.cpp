@@ -5,7 +5,7 @@
 //                    "values": [ { "property": "Size", "reference": "uint64 500", "other": "uint64 300" } ], "acceptedBecause": "",
 //                    "accepted": [ { "property": "Size", "reference": "uint64 500", "other": "uint64 250" } ] } ],
 //     "gone": [ { "kind": ..., "instance": ..., "inventories": [ ... ], "values": [ ... ], "acceptedBecause": "June" } ],
-//     "notCompared": [ ... ], "otherInventories": [ "web09" ], "entriesOfOtherInventories": 2 }
+//     "notCompared": [ ... ], "otherInventories": [ "web09" ], "entriesOfOtherInventories": 2, "entriesOfReference": 0 }
 //
 // Values are texts as in the file. "reference" is null except for "changed". "acceptedBecause" is the reason in the file.
 #include "client/report/JsonBaseline.h"
@@ -66,7 +66,8 @@ nlohmann::ordered_json JsonOfBaseline(const TBaselineOutcome& outcome)
             {"gone", JsonOfEntries(outcome.gone)},
             {"notCompared", JsonOfEntries(outcome.notCompared)},
             {"otherInventories", outcome.absent},
-            {"entriesOfOtherInventories", outcome.ofAbsent}};
+            {"entriesOfOtherInventories", outcome.ofAbsent},
+            {"entriesOfReference", outcome.ofReference}};
 }
 
 }  // namespace NORVZEL20

@@ -2,85 +2,12 @@
 
 #include <gtest/gtest.h>
 
-#include <map>
-#include <string>
-#include <vector>
-
-#include "tests/client/Documents.h"
-#include "tests/client/TClientFixture.h"
+#include "tests/client/baseline/TBaselineFixture.h"
 
 namespace NORVZEL20 {
 namespace {
 
-using TDisks = std::map<std::string, std::string>;
-
-const std::string kMark = "cimdelta-baseline 1\n# Accepted differences, one a line. What stands behind # is the reason.\n\n";
-
-class BaselineTest : public TClientFixture {
-  protected:
-    void SetUp() override
-    {
-        TClientFixture::SetUp();
-        fBaseline = Scratch("base.txt", "");
-        unlink(fBaseline.c_str());
-        System("web01", {{"sda", "1"}, {"sdb", "5"}});
-    }
-
-    /// The disks of a system and their sizes, from now on.
-    void System(const std::string& label, const TDisks& disks)
-    {
-        std::string contents = NORVZEL20::System() +
-                               Class("Disk", "", KeyProperty("Id") + Declaration("Size", "uint16") + Declaration("Note", "string"));
-        for (const auto& [id, size] : disks) {
-            contents += Instance("Disk", Value("Id", id) + Value("Size", size, "uint16"));
-        }
-        fSystems[label] = Scratch(label + ".xml", Document(contents));
-    }
-
-    std::string Compare(std::vector<std::string> options)
-    {
-        options.insert(options.begin(), "compare");
-        for (const auto& [label, path] : fSystems) {
-            options.push_back(label);
-            options.back() += "=" + path;
-        }
-        Run(options);
-        return Shorten(fStatus == 2 ? fErr : fOut, fBaseline, "base.txt");
-    }
-
-    void Accept(const std::vector<std::string>& options = {})
-    {
-        std::vector<std::string> all{"--accept", fBaseline};
-        all.insert(all.end(), options.begin(), options.end());
-        fReport = Compare(all);
-        EXPECT_EQ("", fErr);
-        EXPECT_EQ(0, fStatus);
-    }
-
-    /// The report without the lines on what was compared.
-    std::string Since(const std::vector<std::string>& options = {})
-    {
-        std::vector<std::string> all{"--baseline", fBaseline};
-        all.insert(all.end(), options.begin(), options.end());
-        fReport = Compare(all);
-        EXPECT_EQ("", fErr);
-        return fReport.substr(0, fReport.rfind("\n\n") + 1);
-    }
-
-    /// The entries of the file.
-    std::string Entries() const
-    {
-        const std::string text = ReadFile(fBaseline);
-        EXPECT_EQ(kMark, text.substr(0, kMark.size()));
-        return text.substr(kMark.size());
-    }
-
-    void WriteEntries(const std::string& entries) const { std::ofstream(fBaseline) << kMark << entries; }
-
-    std::map<std::string, std::string> fSystems;  // their files by label, the reference first
-    std::string fBaseline;
-    std::string fReport;
-};
+using BaselineTest = TBaselineFixture;
 
 TEST_F(BaselineTest, WhatIsThereIsAcceptedInSortedLines)
 {
@@ -331,7 +258,7 @@ TEST_F(BaselineTest, JsonHasWhatIsGoneAndWhatChanged)
         "\"accepted\":[{\"property\":\"Size\",\"reference\":\"uint16 1\",\"other\":\"uint16 2\"}]}],"
         "\"gone\":[{\"kind\":\"onlyInOthers\",\"instance\":\"Disk.Id=\\\"sdc\\\"\",\"inventories\":[\"web02\"],"
         "\"values\":[{\"property\":\"Size\",\"reference\":null,\"other\":\"uint16 7\"}],\"acceptedBecause\":\"tested\"}],"
-        "\"notCompared\":[],\"otherInventories\":[],\"entriesOfOtherInventories\":0}",
+        "\"notCompared\":[],\"otherInventories\":[],\"entriesOfOtherInventories\":0,\"entriesOfReference\":0}",
         json.substr(begin, json.find(",\"classes\":[", begin) - begin));
 }
 

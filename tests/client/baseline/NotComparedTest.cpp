@@ -1,0 +1,99 @@
+// An accepted difference is gone if the run compared what it is about and found no such difference. What the run did not compare is
+// not gone: it stays in the file, and the report says so.
+
+#include "tests/client/baseline/TBaselineFixture.h"
+
+namespace NORVZEL20 {
+namespace {
+
+using NotComparedTest = TBaselineFixture;
+
+const std::string kSizeOfShelf = "~ Shelf.Id=\"s1\" Size: uint16 1 -> uint16 2 in web02\n";
+
+TEST_F(NotComparedTest, AClassThatNoInventoryDeclaresIsNotGone)
+{
+    System("web02", {{"sda", "1"}, {"sdb", "5"}});
+    const std::string entries = "+ Shelf.Id=\"s1\" in web02\n" + kSizeOfShelf;
+    WriteEntries(entries);
+    EXPECT_EQ("\n2 accepted differences are for what was not compared: + Shelf.Id=\"s1\" in web02, ...\n",
+              Since().substr(Compare({}).find('\n') + 1));
+    EXPECT_EQ(0, fStatus);
+    Accept();
+    EXPECT_EQ(entries, Entries());
+}
+
+TEST_F(NotComparedTest, APropertyThatNoInventoryDeclaresIsNotGone)
+{
+    System("web02", {{"sda", "1"}, {"sdb", "5"}});
+    const std::string entries = "~ Disk.Id=\"sda\" Model: \"A\" -> \"B\" in web02\n";
+    WriteEntries(entries);
+    EXPECT_NE(std::string::npos, Since().find("\n1 accepted difference is for what was not compared: ~ Disk.Id=\"sda\" Model"))
+        << fReport;
+    Accept();
+    EXPECT_EQ(entries, Entries());
+}
+
+TEST_F(NotComparedTest, AClassThatIsDeclaredAndHasNoInstanceIsGone)
+{
+    const std::string shelf = Class("Shelf", "", KeyProperty("Id") + Declaration("Size", "uint16"));
+    SystemWith("web01", shelf);
+    SystemWith("web02", shelf);
+    WriteEntries(kSizeOfShelf);
+    EXPECT_NE(std::string::npos, Since().find("\nCompared with base.txt: 1 gone; 0 accepted\n")) << fReport;
+    Accept();
+    EXPECT_EQ("", Entries());
+}
+
+TEST_F(NotComparedTest, AClassWithoutInstancesThatTheRulesLeaveOutIsNotGone)
+{
+    const std::string shelf = Class("Shelf", "", KeyProperty("Id") + Declaration("Size", "uint16"));
+    SystemWith("web01", shelf);
+    SystemWith("web02", shelf);
+    WriteEntries(kSizeOfShelf);
+    EXPECT_NE(std::string::npos, Since({"--exclude", "Shelf"}).find("\n1 accepted difference is for what was not compared: "))
+        << fReport;
+}
+
+TEST_F(NotComparedTest, WhatOptionsLeaveOutStaysWhenTheRestIsAccepted)
+{
+    System("web02", {{"sda", "2"}, {"sdb", "5"}, {"sdc", "7"}});
+    Accept();
+    const std::string all = Entries();
+    Accept({"--exclude", "Disk.Size"});
+    EXPECT_EQ(all, Entries());
+    Accept({"--class", "KALMO_*"});
+    EXPECT_EQ(all, Entries());
+}
+
+TEST_F(NotComparedTest, OfAnInstanceThatIsAnotherNowThePropertiesThatWereLeftOutStay)
+{
+    const auto disk = [](const char* id, const char* size) {
+        return Instance("Disk", Value("Id", id) + Value("Model", "A") + Value("Size", size, "uint16"));
+    };
+    const std::string declared =
+        Class("Disk", "", KeyProperty("Id") + Declaration("Model", "string") + Declaration("Size", "uint16"));
+    SystemWith("web01", declared + disk("sda", "1"));
+    SystemWith("web02", declared + disk("sda", "1") + disk("sdb", "2"));
+    Accept();
+    SystemWith("web02", declared + disk("sda", "1") + disk("sdb", "3"));
+    EXPECT_NE(std::string::npos, Since({"--property", "Size"}).find(" in web02; has Size: uint16 3; accepted: Size: uint16 2\n"))
+        << fReport;
+    Accept({"--property", "Size"});
+    EXPECT_EQ("+ Disk.Id=\"sdb\" Model: \"A\", Size: uint16 3 in web02\n", Entries());
+}
+
+TEST_F(NotComparedTest, EntriesForTheReferenceAreSaidToBeThat)
+{
+    System("web02", {{"sda", "2"}, {"sdb", "5"}});
+    Accept();
+    const std::string accepted = Entries();
+    const std::string report = Since({"--reference", "web02"});
+    EXPECT_NE(std::string::npos, report.find("\n1 accepted difference is for web02, which is the reference in this run\n"))
+        << report;
+    EXPECT_EQ(std::string::npos, report.find("not in this run")) << report;
+    Accept({"--reference", "web02"});
+    EXPECT_EQ(accepted + "~ Disk.Id=\"sda\" Size: uint16 2 -> uint16 1 in web01\n", Entries());
+}
+
+}  // namespace
+}  // namespace NORVZEL20
