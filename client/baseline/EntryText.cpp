@@ -1,5 +1,6 @@
 #include "client/baseline/EntryText.h"
 
+#include "client/baseline/FindBadEscape.h"
 #include "client/baseline/ForEachUnquoted.h"
 
 namespace NORVZEL20 {
@@ -12,7 +13,7 @@ bool IsField(const std::string& text)
     bool isWhole = !text.empty() && text.front() != '"' && text.front() != '\'' && text.back() != ',' && text != "in";
     const std::size_t open = ForEachUnquoted(
         text, [&](std::size_t at) { return isWhole = isWhole && text[at] != ' ' && text[at] != '\t' && text[at] != '#'; });
-    return isWhole && open == std::string_view::npos;
+    return isWhole && open == std::string_view::npos && FindBadEscape(text) == std::string_view::npos;
 }
 
 std::string QuotedField(const std::string& text)

@@ -6,42 +6,33 @@
 //
 // and may end with "# REASON". INSTANCE is a class and a key as in a path; VALUE is what ValueIdentity writes. If the rules exclude
 // keys, several instances of an inventory may share one: then "(instances): 2" stands among the values of +, and " x2" behind a
-// VALUE that so many of them have. Different values have " / " between them. Values are compared as texts, so nothing is read from
-// them but where they end: blanks within them count as one, those within quotes as they are.
+// VALUE that so many of them have. Different values have " / " between them. TakeValue.cpp shows what a VALUE is.
 #include "client/baseline/ParseEntry.h"
 
 #include <algorithm>
+#include <cctype>
+#include <map>
+#include <utility>
 
+#include "client/baseline/EntryText.h"
 #include "client/baseline/ForEachUnquoted.h"
+#include "client/baseline/TDifferenceStates.h"
 #include "client/baseline/TEntryScanner.h"
+#include "client/baseline/TakeValue.h"
 
 namespace NORVZEL20 {
 
 namespace {
 
-// The number of braces that are open behind the field.
-int BracesAfter(const std::string& field, int open)
-{
-    ForEachUnquoted(field, [&](std::size_t at) {
-        open += field[at] == '{' ? 1 : field[at] == '}' ? -1 : 0;
-        return true;
-    });
-    return open;
-}
+constexpr char kLabelsExpected[] = "\"in\" and the labels of inventories";
 
-std::vector<std::string> SplitAtCommas(const std::string& field)
+// Names are letters, digits and underscores; what is not ASCII passes.
+bool IsName(std::string_view text)
 {
-    std::vector<std::string> parts;
-    std::size_t begin = 0;
-    ForEachUnquoted(field, [&](std::size_t at) {
-        if (field[at] == ',') {
-            parts.push_back(field.substr(begin, at - begin));
-            begin = at + 1;
-        }
-        return true;
+    return !text.empty() && std::all_of(text.begin(), text.end(), [](char character) {
+        const auto byte = static_cast<unsigned char>(character);
+        return byte >= 0x80 || std::isalnum(byte) != 0 || character == '_';
     });
-    parts.push_back(field.substr(begin));
-    return parts;
 }
 
 // Reads one entry.
@@ -53,12 +44,10 @@ class TEntryParser {
     {
         TAcceptedDifference entry{Kind(), {}, {}, {}};
         entry.line = fLine;
-        if (fScanner.Peek().empty()) {
-            fScanner.Refuse("an instance, such as Disk.Id=\"sda\"");
-        }
-        entry.instance = fScanner.Take();
+        entry.instance = Instance();
         if (entry.kind == TDifference::kChanged) {
-            entry.values.push_back({Property(), Until("->"), Until("in")});
+            entry.values.push_back(Change());
+            Expect("in", kLabelsExpected);
         } else {
             entry.values = Contents(entry.kind);
         }
@@ -72,111 +61,128 @@ class TEntryParser {
     {
         const std::string& sign = fScanner.Peek();
         if (sign != "-" && sign != "+" && sign != "~") {
-            const bool isConflict = sign.find("<<<<<<<") == 0 || sign.find("=======") == 0 || sign.find(">>>>>>>") == 0;
-            fScanner.Refuse(isConflict ? "an entry; keep the entries of both sides of the merge and remove its marks"
-                                       : "an entry, which begins with -, + or ~, or a comment, which begins with #");
+            fScanner.Refuse("an entry, which begins with -, + or ~, or a comment, which begins with #");
         }
         const char kind = fScanner.Take().front();
         return kind == '-' ? TDifference::kOnlyInReference : kind == '+' ? TDifference::kOnlyInOthers : TDifference::kChanged;
     }
 
+    // A class is in quotes if it is called "in".
+    std::string Instance()
+    {
+        const std::string& field = fScanner.Peek();
+        if (field == "in" || (field != FieldText("in") && !IsName(field.substr(0, field.find('.'))))) {
+            fScanner.Refuse("an instance, such as Disk.Id=\"sda\"");
+        }
+        return fScanner.Take();
+    }
+
     std::string Property()
     {
-        if (fScanner.Peek().size() < 2 || fScanner.Peek().back() != ':') {
+        std::string property = fScanner.Peek().substr(0, fScanner.Peek().find(':'));
+        if (fScanner.Peek() != property + ":" || (property != kInstancesMark && !IsName(property))) {
             fScanner.Refuse("a property with a colon behind it, such as Size:");
         }
-        std::string property = fScanner.Take();
-        property.pop_back();
+        fScanner.Take();
         return property;
     }
 
-    // The fields up to `end`, which is taken too.
-    std::string Until(const std::string& end)
+    void Expect(const std::string& mark, const char* expected)
     {
-        std::string value;
-        while (fScanner.Peek() != end) {
-            if (fScanner.Peek().empty() || fScanner.Peek() == "->" || fScanner.Peek() == "in") {
-                break;
-            }
-            value += (value.empty() ? "" : " ") + fScanner.Take();
-        }
-        if (value.empty()) {
-            fScanner.Refuse("a value, such as \"text\", uint16 5 or NULL");
-        }
-        if (fScanner.Peek() != end) {
-            fScanner.Refuse(end == "in" ? "\"in\" and the labels of inventories" : "\"->\" and the value of other inventories");
+        if (fScanner.Peek() != mark) {
+            fScanner.Refuse(expected);
         }
         fScanner.Take();
-        return value;
+    }
+
+    bool TakesComma()
+    {
+        const bool isComma = !fScanner.Peek().empty() && fScanner.Peek().front() == ',';
+        if (isComma) {
+            fScanner.Skip(1);
+        }
+        return isComma;
+    }
+
+    TAcceptedDifference::TValue Change()
+    {
+        TAcceptedDifference::TValue change{Property(), TakeValue(fScanner), std::string()};
+        Expect("->", "\"->\" and the value of other inventories");
+        change.after = TakeValue(fScanner);
+        return change;
     }
 
     // Only an instance that the reference lacks has any.
     std::vector<TAcceptedDifference::TValue> Contents(TDifference::EKind kind)
     {
+        std::map<std::string, std::string> contents;
+        bool isMore = kind == TDifference::kOnlyInOthers && fScanner.Peek() != "in";
+        while (isMore) {
+            if (contents.count(fScanner.Peek().substr(0, fScanner.Peek().find(':'))) > 0) {
+                fScanner.Refuse("each property once; remove one of them");
+            }
+            const std::string property = Property();
+            contents[property] = property == kInstancesMark ? TakeCount(fScanner) : TakeValue(fScanner);
+            isMore = TakesComma();
+        }
+        Expect("in", contents.empty() ? kLabelsExpected : "a comma and another property, or \"in\" and the labels of inventories");
         std::vector<TAcceptedDifference::TValue> values;
-        while (fScanner.Peek() != "in") {
-            if (kind == TDifference::kOnlyInReference || fScanner.Peek().empty()) {
-                fScanner.Refuse("\"in\" and the labels of inventories");
-            }
-            values.push_back({Property(), std::string(), ListedValue()});
+        for (auto& [property, value] : contents) {
+            values.push_back({property, std::string(), std::move(value)});
         }
-        fScanner.Take();
-        std::sort(values.begin(), values.end(), [](const auto& one, const auto& other) { return one.property < other.property; });
         return values;
-    }
-
-    // A value of several, which ends with a comma that is in no braces, or with "in".
-    std::string ListedValue()
-    {
-        std::string value;
-        int open = 0;
-        while (!fScanner.Peek().empty() && fScanner.Peek() != "in") {
-            std::string field = fScanner.Take();
-            open = BracesAfter(field, open);
-            const bool isLast = open <= 0 && field.back() == ',';
-            if (isLast) {
-                field.pop_back();
-            }
-            value += (value.empty() ? "" : " ") + field;
-            if (isLast) {
-                break;
-            }
-        }
-        if (value.empty()) {
-            fScanner.Refuse("a value, such as \"text\", uint16 5 or NULL");
-        }
-        return value;
     }
 
     std::vector<std::string> Labels()
     {
         std::vector<std::string> labels;
-        while (!fScanner.Peek().empty()) {
-            for (const std::string& label : SplitAtCommas(fScanner.Take())) {
-                if (!label.empty()) {
-                    labels.push_back(Unquoted(label));
-                }
-            }
-        }
-        if (labels.empty()) {
-            fScanner.Refuse("the label of an inventory");
+        do {
+            labels.push_back(Label());
+        } while (TakesComma());
+        if (!fScanner.Peek().empty()) {
+            fScanner.Refuse("a comma and another label, or # and the reason");
         }
         std::sort(labels.begin(), labels.end());
         labels.erase(std::unique(labels.begin(), labels.end()), labels.end());
         return labels;
     }
 
-    static std::string Unquoted(const std::string& field)
+    // A field, or a part of one in front of a comma.
+    std::string Label()
     {
-        if (field.size() < 2 || field.front() != '"' || field.back() != '"') {
-            return field;
+        const std::string_view rest = fScanner.GetRest();
+        if (!rest.empty() && rest.front() == '"') {
+            return QuotedLabel(rest);
         }
-        std::string text;
-        for (std::size_t i = 1; i + 1 < field.size(); ++i) {
-            i += field[i] == '\\' && i + 2 < field.size() ? 1 : 0;
-            text += field[i];
+        std::size_t length = rest.size();
+        ForEachUnquoted(rest, [&](std::size_t at) {
+            if (rest[at] == '#') {
+                fScanner.RefuseAt(at, "a blank in front of the reason, or the label in quotes");
+            }
+            const bool isEnd = rest[at] == ' ' || rest[at] == '\t' || rest[at] == ',';
+            length = isEnd ? at : length;
+            return !isEnd;
+        });
+        if (length == 0) {
+            fScanner.Refuse("the label of an inventory");
         }
-        return text;
+        std::string label(rest.substr(0, length));
+        fScanner.Skip(length);
+        return label;
+    }
+
+    std::string QuotedLabel(std::string_view rest)
+    {
+        const std::size_t end = fScanner.EndOfQuoted(0);
+        std::string label;
+        for (std::size_t i = 1; i + 1 < end; ++i) {
+            if (rest[i] == '\\' && rest[++i] != '"' && rest[i] != '\\') {
+                fScanner.RefuseAt(i - 1, "\\\\ or \\\", the escapes that a label can have");
+            }
+            label += rest[i];
+        }
+        fScanner.Skip(end);
+        return label;
     }
 
     TEntryScanner fScanner;

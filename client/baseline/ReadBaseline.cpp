@@ -3,6 +3,7 @@
 #include <sys/stat.h>
 
 #include <algorithm>
+#include <cerrno>
 #include <utility>
 #include <vector>
 
@@ -10,6 +11,8 @@
 #include "client/files/TInputFile.h"
 #include "client/process/TClientError.h"
 #include "client/text/DisplayText.h"
+#include "client/text/QuoteForShell.h"
+#include "embedded/value/TUtf8.h"
 
 namespace NORVZEL20 {
 
@@ -18,6 +21,23 @@ namespace {
 constexpr std::size_t kBlockSize = 64 * 1024;
 constexpr std::size_t kMostBytes = static_cast<std::size_t>(1) << 30;
 constexpr char kByteOrderMark[] = "\xEF\xBB\xBF";
+
+// The mark of a merge conflict at the beginning of the line; null if there is none.
+const char* FindMergeMark(std::string_view text)
+{
+    for (const char* const mark : {"<<<<<<<", "|||||||", "=======", ">>>>>>>"}) {
+        if (text.find(mark) == 0) {
+            return mark;
+        }
+    }
+    return nullptr;
+}
+
+// Whether the line is the mark of a baseline, of whatever version.
+bool IsMark(std::string_view text)
+{
+    return text.substr(0, text.find_first_of(" \t")) == kBaselineMark;
+}
 
 // Reads a file line by line.
 class TBaselineParser {
@@ -28,6 +48,7 @@ class TBaselineParser {
     {
         ++fLine;
         const std::size_t end = text.find_last_not_of(" \t\r");
+        CheckCharacters(text.substr(0, end + 1));
         const std::size_t begin = text.find_first_not_of(" \t");
         if (end == std::string_view::npos) {
             return EndComments();
@@ -35,7 +56,11 @@ class TBaselineParser {
         text = text.substr(0, end + 1);
         if (text[begin] == '#') {
             fComments.emplace_back(text.substr(begin));
-        } else if (text.find(kBaselineMark) == begin) {
+        } else if (const char* const mark = FindMergeMark(text)) {
+            Refuse(1, "found " + std::string(mark) +
+                          " of a merge that is not finished; keep the entries of both sides, and remove the lines with <<<<<<<, "
+                          "======= and >>>>>>>");
+        } else if (IsMark(text.substr(begin))) {
             CheckVersion(text.substr(begin + sizeof kBaselineMark - 1), begin + sizeof kBaselineMark);
         } else {
             AddEntry(text);
@@ -44,6 +69,10 @@ class TBaselineParser {
 
     TBaseline Take()
     {
+        if (!fHasMark) {
+            fLine = 1;
+            RefuseWithoutMark();
+        }
         EndComments();
         return std::move(fBaseline);
     }
@@ -52,6 +81,29 @@ class TBaselineParser {
     [[noreturn]] void Refuse(std::size_t column, const std::string& what) const
     {
         throw TClientError(fFile + ":" + std::to_string(fLine) + ":" + std::to_string(column) + ": " + what);
+    }
+
+    [[noreturn]] void RefuseWithoutMark() const
+    {
+        Refuse(1, "found no line \"" + std::string(kBaselineMark) + " " + kBaselineVersion +
+                      "\" in front, expected a baseline; make one with --accept");
+    }
+
+    void CheckCharacters(std::string_view text) const
+    {
+        const std::size_t invalid = TUtf8::FindInvalid(text);
+        const auto control = static_cast<std::size_t>(
+            std::find_if(text.begin(), text.end(),
+                         [](char one) { return (one >= 0 && one < ' ' && one != '\t') || one == '\x7f'; }) -
+            text.begin());
+        const std::size_t bad = std::min(invalid, control);
+        if (bad == text.size()) {
+            return;
+        }
+        const std::string shown = EscapeForDisplay(text.substr(bad, 1));
+        Refuse(bad + 1, bad == invalid
+                            ? "found the byte " + shown + ", which is no UTF-8; save the file as UTF-8"
+                            : "found the control character " + shown + "; remove it, or write it within quotes as " + shown);
     }
 
     // Comments with a blank line behind them belong to the file. Files that were joined have the same ones.
@@ -81,8 +133,7 @@ class TBaselineParser {
     void AddEntry(std::string_view text)
     {
         if (!fHasMark) {
-            Refuse(1, "found no line \"" + std::string(kBaselineMark) + " " + kBaselineVersion +
-                          "\" in front, expected a baseline; make one with --accept");
+            RefuseWithoutMark();
         }
         TAcceptedDifference entry = ParseEntry(text, fFile, fLine);
         entry.comments = std::move(fComments);
@@ -132,6 +183,16 @@ TBaseline ParseBaseline(std::string_view text, const std::string& file)
     return parser.Take();
 }
 
+void CheckBaseline(const std::string& path)
+{
+    struct stat status;
+    if (stat(path.c_str(), &status) != 0 && errno == ENOENT) {
+        throw TClientError(path + ": there is no such file; make it with --accept " + QuoteForShell(path) +
+                           " in place of --baseline, which accepts the present differences");
+    }
+    const TInputFile readable(path);
+}
+
 TBaseline ReadBaseline(const std::string& path)
 {
     return ParseBaseline(ReadText(path), path);
@@ -147,7 +208,8 @@ TBaseline ReadBaselineIfAny(const std::string& path)
     if (!S_ISREG(status.st_mode)) {
         throw TClientError(path + ": is no ordinary file; name one that accepted differences can be kept in");
     }
-    return ReadBaseline(path);
+    // An empty one has been made for it, by mktemp for instance.
+    return status.st_size == 0 ? TBaseline() : ReadBaseline(path);
 }
 
 }  // namespace NORVZEL20

@@ -3,9 +3,11 @@
 #include <algorithm>
 #include <utility>
 
+#include "client/baseline/FindBadEscape.h"
 #include "client/baseline/ForEachUnquoted.h"
 #include "client/process/TClientError.h"
 #include "client/text/DisplayText.h"
+#include "embedded/value/TUtf8.h"
 
 namespace NORVZEL20 {
 
@@ -46,10 +48,42 @@ void TEntryScanner::Advance()
         }
         return true;
     });
-    if (open != std::string_view::npos) {
-        RefuseAt(fBegin + open, "found a text without the quote at its end; a quote in a text has a \\ before it");
-    }
+    CheckQuotes(fBegin, fEnd, open);
     fField = fText.substr(fBegin, fEnd - fBegin);
+}
+
+// `open` is where ForEachUnquoted found a quote that is not closed.
+void TEntryScanner::CheckQuotes(std::size_t begin, std::size_t end, std::size_t open) const
+{
+    if (open != std::string_view::npos) {
+        RefusePlace(begin + open, "found a text without the quote at its end; a quote in a text has a \\ before it");
+    }
+    if (const std::size_t bad = FindBadEscape(fText.substr(begin, end - begin)); bad != std::string_view::npos) {
+        RefusePlace(begin + bad, "found a \\ that begins no escape; write \\\\ for a backslash");
+    }
+}
+
+std::size_t TEntryScanner::EndOfQuoted(std::size_t offset) const
+{
+    const std::size_t begin = fBegin + offset;
+    std::size_t end = begin + 1;
+    for (; end < fText.size() && fText[end] != fText[begin]; ++end) {
+        end += fText[end] == '\\' ? 1 : 0;
+    }
+    const bool isClosed = end < fText.size();
+    CheckQuotes(begin, isClosed ? end + 1 : begin, isClosed ? std::string_view::npos : 0);
+    return end + 1 - fBegin;
+}
+
+std::string_view TEntryScanner::GetRest() const
+{
+    return fField.empty() ? std::string_view() : fText.substr(fBegin);
+}
+
+void TEntryScanner::Skip(std::size_t length)
+{
+    fEnd = fBegin + length;
+    Advance();
 }
 
 std::string TEntryScanner::GetReason() const
@@ -63,13 +97,26 @@ std::string TEntryScanner::GetReason() const
 
 void TEntryScanner::Refuse(const std::string& expected) const
 {
-    const bool isCut = fField.size() > kMostShown;
-    const std::string found =
-        fField.empty() ? "the end of the entry" : EscapeForDisplay(fField.substr(0, kMostShown)) + (isCut ? "..." : "");
-    RefuseAt(fBegin, "found " + found + ", expected " + expected);
+    RefuseFound(fBegin, fField, expected);
 }
 
-void TEntryScanner::RefuseAt(std::size_t position, const std::string& what) const
+void TEntryScanner::RefuseAt(std::size_t offset, const std::string& expected) const
+{
+    const std::string_view rest = GetRest();
+    const std::size_t begin = std::min(rest.find_first_not_of(kBlanks, offset), rest.size());
+    const std::string_view found = rest.substr(begin);
+    RefuseFound(fBegin + begin, std::string(found.substr(0, found.find_first_of(kBlanks))), expected);
+}
+
+void TEntryScanner::RefuseFound(std::size_t position, const std::string& field, const std::string& expected) const
+{
+    const bool isEnd = field.empty() || field.front() == '#';
+    const std::string shown(TUtf8::Shorten(field, kMostShown));
+    const std::string found = isEnd ? "the end of the entry" : EscapeForDisplay(shown) + (shown.size() < field.size() ? "..." : "");
+    RefusePlace(position, "found " + found + ", expected " + expected);
+}
+
+void TEntryScanner::RefusePlace(std::size_t position, const std::string& what) const
 {
     throw TClientError(fFile + ":" + std::to_string(fLine) + ":" + std::to_string(position + 1) + ": " + what);
 }

@@ -2,8 +2,8 @@
 
 #include <utility>
 
+#include "client/baseline/ReadBaseline.h"
 #include "client/commands/SaveRules.h"
-#include "client/files/TInputFile.h"
 #include "client/inventory/CheckInventoryFiles.h"
 #include "client/inventory/DropRepeatedFiles.h"
 #include "client/inventory/LoadSchema.h"
@@ -40,7 +40,7 @@ void CheckBaselineFiles(const TCommandFiles& files, std::vector<std::string>& in
         }
     }
     if (!files.baseline.empty()) {
-        const TInputFile readable(files.baseline);
+        CheckBaseline(files.baseline);
         inputs.push_back(files.baseline);
     }
     if (files.accept.empty()) {

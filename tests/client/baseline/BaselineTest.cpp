@@ -216,7 +216,7 @@ TEST_F(BaselineTest, AnEmptyBaselineLeavesTheReportAsItIs)
 {
     System("web02", {{"sda", "2"}, {"sdc", "7"}});
     System("web03", {{"sda", "2"}, {"sdb", "6"}});
-    Scratch("base.txt", "");
+    WriteEntries("");
     for (const char* const format : {"json", "ndjson"}) {
         const std::string plain = Compare({"-o", format});
         const std::string beside = Compare({"-o", format, "--baseline", fBaseline});
@@ -225,6 +225,17 @@ TEST_F(BaselineTest, AnEmptyBaselineLeavesTheReportAsItIs)
         EXPECT_EQ(1, fStatus);
     }
     EXPECT_EQ("\nCompared with base.txt: 4 new; 0 accepted\n", Since().substr(Compare({}).rfind("\n\n") + 1));
+}
+
+TEST_F(BaselineTest, AnEmptyFileCanBeFilledAndIsNoBaseline)
+{
+    System("web02", {{"sda", "2"}, {"sdb", "5"}});
+    Scratch("base.txt", "");
+    EXPECT_EQ(
+        "cimdelta: base.txt:1:1: found no line \"cimdelta-baseline 1\" in front, expected a baseline; make one with --accept\n",
+        Compare({"--baseline", fBaseline}));
+    Accept();
+    EXPECT_EQ("~ Disk.Id=\"sda\" Size: uint16 1 -> uint16 2 in web02\n", Entries());
 }
 
 TEST_F(BaselineTest, JoinedFilesOfTwoPeopleAreTheUnionOfBoth)
@@ -265,7 +276,9 @@ TEST_F(BaselineTest, JsonHasWhatIsGoneAndWhatChanged)
 TEST_F(BaselineTest, AFileThatCannotBeReadOrWrittenIsRefusedBeforeAnythingElse)
 {
     System("web02", {{"sda", "2"}});
-    EXPECT_EQ("cimdelta: base.txt: cannot be opened: No such file or directory\n", Compare({"--baseline", fBaseline}));
+    EXPECT_EQ("cimdelta: base.txt: there is no such file; make it with --accept base.txt in place of --baseline, which accepts the "
+              "present differences\n",
+              Compare({"--baseline", fBaseline}));
     EXPECT_EQ("cimdelta: /dev/zero: is no ordinary file; name one that accepted differences can be kept in\n",
               Compare({"--accept", "/dev/zero"}));
     EXPECT_EQ("cimdelta: /no/such/base.txt: cannot be written: No such file or directory\n",
