@@ -23,8 +23,8 @@ TAcceptedDifference WithLabels(TAcceptedDifference entry, std::vector<std::strin
 
 }  // namespace
 
-TBaselineReview::TBaselineReview(IDifferences& all, const TAcceptance& acceptance)
-    : fAcceptance(acceptance), fKept(acceptance.GetBaseline().GetEntries().size()),
+TBaselineReview::TBaselineReview(IDifferences& all, const TAcceptance& acceptance, bool isAccepting)
+    : fAcceptance(acceptance), fIsAccepting(isAccepting), fKept(acceptance.GetBaseline().GetEntries().size()),
       fReplaced(acceptance.GetBaseline().GetEntries().size())
 {
     all.ForEach([this](const TDifference& difference) { Add(difference); });
@@ -36,35 +36,42 @@ void TBaselineReview::Add(const TDifference& difference)
     const TDifferenceStates states(difference);
     std::vector<std::size_t> left;
     std::vector<std::size_t> entries;  // of those in fOutcome.changed that this difference adds
+    bool isNew = false;
     for (const std::size_t inventory : difference.inventories) {
-        const std::string& label = fAcceptance.LabelOf(inventory);
-        TAcceptance::TVerdict verdict = fAcceptance.Judge(difference, states, inventory);
+        const TAcceptance::TVerdict verdict = fAcceptance.Judge(difference, states, inventory);
         if (verdict.isAccepted) {
-            fKept[*verdict.entry].push_back(label);
+            fKept[*verdict.entry].push_back(fAcceptance.LabelOf(inventory));
             continue;
         }
         left.push_back(inventory);
-        TAcceptedDifference present{difference.kind,
-                                    states.GetInstance(),
-                                    verdict.entry ? std::move(verdict.present) : states.ValuesOf(inventory),
-                                    {label}};
         if (verdict.entry) {
-            fReplaced[*verdict.entry].push_back(label);
-            AddChanged(present, *verdict.entry, entries);
+            AddChanged(Present(difference, states, inventory, verdict.present), *verdict.entry, entries);
+        } else {
+            isNew = true;
         }
-        fUnaccepted.Add(std::move(present));
+        if (fIsAccepting) {
+            fUnaccepted.Add(Present(difference, states, inventory, verdict.entry ? verdict.present : states.ValuesOf(inventory)));
+        }
     }
     fOutcome.accepted += left.empty() ? 1 : 0;
-    fOutcome.different += entries.empty() ? 0 : 1;
-    fOutcome.appeared += !left.empty() && entries.empty() ? 1 : 0;
+    fOutcome.appeared += isNew ? 1 : 0;
+    const bool isWhole = left.size() == difference.inventories.size();
+    fShares.push_back(isWhole ? EUnaccepted::kAll : left.empty() ? EUnaccepted::kNone : EUnaccepted::kSome);
     if (!left.empty()) {
         Count(difference, left);
     }
 }
 
+TAcceptedDifference TBaselineReview::Present(const TDifference& difference, const TDifferenceStates& states, std::size_t inventory,
+                                             std::vector<TAcceptedDifference::TValue> values) const
+{
+    return {difference.kind, states.GetInstance(), std::move(values), {fAcceptance.LabelOf(inventory)}};
+}
+
 // Inventories with the same values and the same entry stand together.
 void TBaselineReview::AddChanged(const TAcceptedDifference& present, std::size_t entry, std::vector<std::size_t>& entries)
 {
+    fReplaced[entry].push_back(present.inventories.front());
     std::vector<TBaselineOutcome::TChanged>& changed = fOutcome.changed;
     const std::size_t first = changed.size() - entries.size();
     for (std::size_t i = 0; i < entries.size(); ++i) {

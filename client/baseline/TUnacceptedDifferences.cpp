@@ -1,5 +1,8 @@
 #include "client/baseline/TUnacceptedDifferences.h"
 
+#include <algorithm>
+#include <iterator>
+
 #include "client/baseline/ReduceDifference.h"
 
 namespace NORVZEL20 {
@@ -7,20 +10,28 @@ namespace NORVZEL20 {
 void TUnacceptedDifferences::ForEach(const TCallback& callback)
 {
     TPropertyOrder order(fAcceptance->GetReference());
+    std::size_t position = 0;
     fAll->ForEach([&](const TDifference& difference) {
-        const TDifferenceStates states(difference);
-        std::vector<std::size_t> left;
-        for (const std::size_t inventory : difference.inventories) {
-            if (!fAcceptance->Judge(difference, states, inventory).isAccepted) {
-                left.push_back(inventory);
-            }
-        }
-        if (left.size() == difference.inventories.size()) {
+        switch (fShares[position++]) {
+        case EUnaccepted::kAll:
             callback(difference);
-        } else if (!left.empty()) {
-            callback(ReduceDifference(difference, left, order));
+            break;
+        case EUnaccepted::kSome:
+            callback(ReduceDifference(difference, FindUnaccepted(difference), order));
+            break;
+        default:
+            break;
         }
     });
+}
+
+std::vector<std::size_t> TUnacceptedDifferences::FindUnaccepted(const TDifference& difference) const
+{
+    const TDifferenceStates states(difference);
+    std::vector<std::size_t> unaccepted;
+    std::copy_if(difference.inventories.begin(), difference.inventories.end(), std::back_inserter(unaccepted),
+                 [&](std::size_t inventory) { return !fAcceptance->Judge(difference, states, inventory).isAccepted; });
+    return unaccepted;
 }
 
 }  // namespace NORVZEL20

@@ -1,7 +1,10 @@
 #pragma once
 
 #include <memory>
+#include <utility>
+#include <vector>
 
+#include "client/baseline/EUnaccepted.h"
 #include "client/baseline/TAcceptance.h"
 #include "client/comparison/IDifferences.h"
 
@@ -12,19 +15,22 @@ namespace NORVZEL20 {
 /// Threads: one at a time.
 class TUnacceptedDifferences final : public IDifferences {
   public:
-    /// `counts` are those of what ForEach calls back with.
+    /// `shares` and `counts` are what TBaselineReview found in `all`.
     TUnacceptedDifferences(std::shared_ptr<IDifferences> all, std::shared_ptr<const TAcceptance> acceptance,
-                           const TDifferenceCounts& counts)
-        : fAll(std::move(all)), fAcceptance(std::move(acceptance)), fCounts(counts)
+                           std::vector<EUnaccepted> shares, const TDifferenceCounts& counts)
+        : fAll(std::move(all)), fAcceptance(std::move(acceptance)), fShares(std::move(shares)), fCounts(counts)
     {}
 
     TDifferenceCounts GetCounts() const override { return fCounts; }
-    /// Cost, beside that of the differences: the texts of their values.
+    /// Cost, beside that of the differences: the texts of the values of those that are accepted for some inventories.
     void ForEach(const TCallback& callback) override;
 
   private:
+    std::vector<std::size_t> FindUnaccepted(const TDifference& difference) const;
+
     const std::shared_ptr<IDifferences> fAll;
     const std::shared_ptr<const TAcceptance> fAcceptance;
+    const std::vector<EUnaccepted> fShares;
     const TDifferenceCounts fCounts;
 };
 

@@ -20,9 +20,9 @@ struct TBaselineOutcome {
     std::string file;
     bool isAccepting = false;               ///< whether the file takes over what the report shows
     std::size_t accepted = 0;               ///< differences that the baseline accepts in all their inventories
-    std::size_t appeared = 0;               ///< differences of the report that are in the baseline for none of their inventories
-    std::size_t different = 0;              ///< the others of the report: some inventory was accepted with another value
-    std::vector<TChanged> changed;          ///< for each of those, what was accepted
+    std::size_t appeared = 0;               ///< differences of the report that are in the baseline for none of their inventories,
+                                            ///< or not for all
+    std::vector<TChanged> changed;          ///< what was accepted with another value
     std::vector<TAcceptedDifference> gone;  ///< accepted, and no longer there; only for inventories that were compared
     std::vector<TAcceptedDifference> notCompared;  ///< those whose class or property was not compared in this run
     std::vector<std::string> absent;               ///< labels in the baseline that no other inventory of the run has, ascending

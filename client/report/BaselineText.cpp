@@ -34,7 +34,7 @@ std::string Verdict(const TBaselineOutcome& outcome)
         }
     };
     add(outcome.appeared, " new");
-    add(outcome.different, " changed since");
+    add(outcome.changed.size(), " changed since");
     add(outcome.gone.size(), outcome.isAccepting ? " gone and removed" : " gone");
     const std::string changes = parts.empty() ? "nothing new" : boost::algorithm::join(parts, ", ");
     return outcome.isAccepting ? "Accepted in " + file + ": " + changes + "; " + std::to_string(outcome.accepted) + " as before"
@@ -137,7 +137,7 @@ std::string WriteBaselineText(const TComparisonReport& report, const TTextOption
     }
     const TBaselineOutcome& outcome = *report.baseline;
     TBaselineLines lines(options);
-    if (outcome.isAccepting || outcome.appeared + outcome.different + outcome.gone.size() > 0) {
+    if (outcome.isAccepting || outcome.appeared + outcome.changed.size() + outcome.gone.size() > 0) {
         lines.Add(Verdict(outcome));
     }
     if (!options.isSummary) {

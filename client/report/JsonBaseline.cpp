@@ -61,7 +61,7 @@ nlohmann::ordered_json JsonOfBaseline(const TBaselineOutcome& outcome)
             {"accepting", outcome.isAccepting},
             {"accepted", outcome.accepted},
             {"new", outcome.appeared},
-            {"changedSince", outcome.different},
+            {"changedSince", outcome.changed.size()},
             {"changed", std::move(changed)},
             {"gone", JsonOfEntries(outcome.gone)},
             {"notCompared", JsonOfEntries(outcome.notCompared)},

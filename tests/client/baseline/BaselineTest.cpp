@@ -71,6 +71,23 @@ TEST_F(BaselineTest, AnotherValueThanAcceptedIsReportedWithBoth)
     EXPECT_EQ(1, fStatus);
 }
 
+TEST_F(BaselineTest, WhatIsCountedAsChangedIsWhatIsListed)
+{
+    for (const auto& [label, size] : TDisks{{"web02", "2"}, {"web03", "3"}, {"web04", "1"}}) {
+        System(label, {{"sda", size}, {"sdb", "5"}});
+    }
+    Accept();
+    for (const auto& [label, size] : TDisks{{"web02", "4"}, {"web03", "4"}, {"web04", "4"}}) {
+        System(label, {{"sda", size}, {"sdb", "5"}});
+    }
+    const std::string since = Since();
+    EXPECT_EQ("Compared with base.txt: 1 new, 2 changed since; 0 accepted\n"
+              "  changed  ~ Disk.Id=\"sda\" Size: uint16 1 -> uint16 4 in web02; accepted: uint16 1 -> uint16 2\n"
+              "  changed  ~ Disk.Id=\"sda\" Size: uint16 1 -> uint16 4 in web03; accepted: uint16 1 -> uint16 3\n",
+              since.substr(since.find("Compared")));
+    EXPECT_NE(std::string::npos, Compare({"--baseline", fBaseline, "-o", "json"}).find("\"changedSince\": 2,")) << fOut;
+}
+
 TEST_F(BaselineTest, AnotherValueOfTheReferenceIsAChangeToo)
 {
     System("web02", {{"sda", "2"}, {"sdb", "5"}});
