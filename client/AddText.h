@@ -17,7 +17,7 @@ inline std::string RefuseEmpty(const std::string& text)
 template <class TTarget>
 CLI::Option* AddText(CLI::App* command, const char* name, TTarget& target, const char* description)
 {
-    return command->add_option(name, target, description)->transform(&UnguardArgument)->check(&RefuseEmpty);
+    return command->add_option(name, target, description)->transform(&TakeGuardOff)->check(&RefuseEmpty);
 }
 
 }  // namespace NORVZEL20

@@ -8,7 +8,10 @@ namespace NORVZEL20 {
 /// that begin with standard input, such as -,a.xml, for an option. Errors: std::bad_alloc.
 std::string GuardArgument(const std::string& argument);
 
-/// The argument as the user wrote it, from one that was guarded or quotes one that was.
+/// The argument as the user wrote it, from one that was guarded.
+std::string TakeGuardOff(std::string argument);
+
+/// The same for a text that may quote guarded arguments; it loses all control characters U+0001.
 std::string UnguardArgument(std::string text);
 
 }  // namespace NORVZEL20

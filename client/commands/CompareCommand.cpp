@@ -17,6 +17,8 @@
 #include "client/report/DescribeNothingCompared.h"
 #include "client/report/TResultOutput.h"
 #include "client/rules/ReadRules.h"
+#include "client/text/DisplayText.h"
+#include "embedded/value/TUtf8.h"
 
 namespace NORVZEL20 {
 
@@ -28,6 +30,18 @@ constexpr std::size_t kMostLinesOnTerminal = 200;
 bool IsBesideBaseline(const TBaselineOptions& options)
 {
     return !options.accept.empty() || !options.baseline.empty();
+}
+
+// A reason is the end of a line of the file.
+void CheckReason(const std::string& reason)
+{
+    const std::size_t invalid = TUtf8::FindInvalid(reason);
+    const bool hasControl =
+        std::any_of(reason.begin(), reason.end(), [](char one) { return (one >= 0 && one < ' ') || one == '\x7f'; });
+    if (hasControl || invalid < reason.size()) {
+        throw TClientError("found --reason " + QuoteForDisplay(reason) +
+                           ", expected one line of text in UTF-8; leave out what is shown as " + "\\n or the like");
+    }
 }
 
 // What needs no file to be found wrong.
@@ -47,6 +61,7 @@ void CheckOptions(const TCompareOptions& options, const IConsole& console)
     if (!options.baseline.accept.empty() && !options.only.kinds.empty()) {
         throw TClientError("--only cannot be used with --accept, which keeps all differences, shown or not; leave one of them out");
     }
+    CheckReason(options.baseline.reason);
     if (options.text.isSummary && options.format != EOutputFormat::kText) {
         throw TClientError("--summary is for text reports; leave it out, or -o, whose reports have a summary of their own");
     }

@@ -201,6 +201,25 @@ TEST_F(BaselineTest, ReasonsAndCommentsStayWithWhatStillHolds)
     EXPECT_NE(std::string::npos, fReport.find("\nAccepted in base.txt: 1 new, 1 gone and removed; 1 as before\n")) << fReport;
 }
 
+TEST_F(BaselineTest, AReasonIsOneLineOfText)
+{
+    System("web02", {{"sda", "2"}, {"sdb", "5"}});
+    for (const auto& [reason, shown] : std::map<std::string, std::string>{{"two\nlines", "two\\nlines"},
+                                                                          {"\x1b[1m", "\\x1b[1m"},
+                                                                          {"a\x01", "a\\x01"},
+                                                                          {"\x01", "\\x01"},
+                                                                          {"\xe9t\xe9", "\\xe9t\\xe9"}}) {
+        EXPECT_EQ("cimdelta: found --reason \"" + shown +
+                      "\", expected one line of text in UTF-8; leave out what is shown as \\n or the like\n",
+                  Compare({"--accept", fBaseline, "--reason", reason}));
+    }
+    Accept({"--reason", " [d\xc3\xa9j\xc3\xa0\xc2\xa0vu]  "});
+    const std::string once = Entries();
+    EXPECT_EQ("~ Disk.Id=\"sda\" Size: uint16 1 -> uint16 2 in web02  # [d\xc3\xa9j\xc3\xa0\xc2\xa0vu]\n", once);
+    Accept();
+    EXPECT_EQ(once, Entries());
+}
+
 TEST_F(BaselineTest, EntriesOfInventoriesThatAreNotInTheRunStayAndAreCounted)
 {
     System("web02", {{"sda", "2"}, {"sdb", "5"}});
