@@ -2,7 +2,7 @@
 
 #include "client/inventory/CollectObjects.h"
 #include "client/inventory/UncomparedSystems.h"
-#include "embedded/value/TValueXml.h"
+#include "client/rules/RulesXml.h"
 #include "host/RootClassName.h"
 #include "provider/DeltaNames.h"
 
@@ -12,10 +12,7 @@ namespace {
 
 std::string Element(const std::string& className, const char* treatment)
 {
-    std::string element = "  <class";
-    TValueXml::AppendAttribute(element, "name", className);
-    TValueXml::AppendAttribute(element, "default", treatment);
-    return element + "/>\n";
+    return WriteRulesElement({className, treatment, {}, {}, {}});
 }
 
 }  // namespace
@@ -23,7 +20,7 @@ std::string Element(const std::string& className, const char* treatment)
 std::string MakeRulesForEverything(const std::vector<TInventory>& inventories, const std::vector<TSchemaNote>& notes)
 {
     const TInventory& reference = inventories.front();
-    std::string rules = "<?xml version=\"1.0\" encoding=\"UTF-8\"?>\n<DifftoolSpec version=\"1.0\">\n";
+    std::string rules;
     for (const boost::shared_ptr<ICIMClass>& cls : SubclassesOf(*reference.ns->GetClass(kRootClassName, TCallContext()))) {
         rules += Element(cls->GetName(TCallContext()), "include");
     }
@@ -35,7 +32,7 @@ std::string MakeRulesForEverything(const std::vector<TInventory>& inventories, c
             rules += Element(cls->GetName(TCallContext()), "include");
         }
     }
-    return rules + "</DifftoolSpec>\n";
+    return kRulesDeclaration + WriteRulesDocument(rules);
 }
 
 }  // namespace NORVZEL20

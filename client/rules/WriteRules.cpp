@@ -16,8 +16,8 @@
 #include <map>
 #include <set>
 
+#include "client/rules/RulesXml.h"
 #include "client/text/DisplayText.h"
-#include "embedded/value/TValueXml.h"
 #include "provider/DeltaNames.h"
 
 namespace NORVZEL20 {
@@ -151,43 +151,21 @@ class TRulesWriter {
 
     std::string WriteKeys(std::size_t position) const
     {
-        return HasElementForKeys(position) ? Start(position, nullptr, true) + "/>\n" : std::string();
+        return HasElementForKeys(position)
+                   ? WriteRulesElement({fClasses[position].name, std::string(), fPlans[position].keys, {}, {}})
+                   : std::string();
     }
 
     std::string WriteElement(std::size_t position) const
     {
+        const TClass& cls = fClasses[position];
         const TPlan& plan = fPlans[position];
-        const std::string remarks = Comment(fClasses[position].remarks, "  ");
+        const std::string remarks = Comment(cls.remarks, "  ");
         if (!plan.hasElement) {
             return remarks;
         }
-        const std::string start = remarks + Start(position, fClasses[position].isByDefault ? "include" : "exclude", plan.isFirst);
-        const std::string lists = List("includelist", plan.included) + List("excludelist", plan.excluded);
-        return start + (lists.empty() ? "/>\n" : ">\n" + lists + "  </class>\n");
-    }
-
-    std::string Start(std::size_t position, const char* treatment, bool hasKeys) const
-    {
-        std::string start = "  <class";
-        TValueXml::AppendAttribute(start, "name", fClasses[position].name);
-        if (treatment != nullptr) {
-            TValueXml::AppendAttribute(start, "default", treatment);
-        }
-        if (hasKeys && !fPlans[position].keys.empty()) {
-            TValueXml::AppendAttribute(start, "excludekeys", boost::algorithm::join(fPlans[position].keys, " "));
-        }
-        return start;
-    }
-
-    static std::string List(const std::string& name, const std::vector<std::string>& properties)
-    {
-        std::string list;
-        for (const std::string& property : properties) {
-            list += "      <value>";
-            TValueXml::AppendEscaped(list, property);
-            list += "</value>\n";
-        }
-        return list.empty() ? list : "    <" + name + ">\n" + list + "    </" + name + ">\n";
+        const std::vector<std::string> keys = plan.isFirst ? plan.keys : std::vector<std::string>();
+        return remarks + WriteRulesElement({cls.name, cls.isByDefault ? "include" : "exclude", keys, plan.included, plan.excluded});
     }
 
     const std::vector<TClass>& fClasses;
@@ -198,8 +176,7 @@ class TRulesWriter {
 
 std::string WriteRules(const std::vector<TRulesDraft::TClass>& classes, const std::vector<std::string>& heading)
 {
-    return "<?xml version=\"1.0\" encoding=\"UTF-8\"?>\n" + Comment(heading, "") + "<DifftoolSpec version=\"1.0\">\n" +
-           TRulesWriter(classes).Write() + "</DifftoolSpec>\n";
+    return kRulesDeclaration + Comment(heading, "") + WriteRulesDocument(TRulesWriter(classes).Write());
 }
 
 }  // namespace NORVZEL20

@@ -10,45 +10,22 @@
 
 #include <algorithm>
 
+#include "client/rules/RulesXml.h"
 #include "client/text/QuoteForShell.h"
-#include "embedded/value/TValueXml.h"
 #include "host/RootClassName.h"
 
 namespace NORVZEL20 {
 
 namespace {
 
-const char kFileEnd[] = "</DifftoolSpec>";
-
-std::string StartOfElement(const std::string& className, TCIMDiffEngine::propType treatment)
-{
-    std::string element = "  <class";
-    TValueXml::AppendAttribute(element, "name", className);
-    TValueXml::AppendAttribute(element, "default", treatment == TCIMDiffEngine::INCLUDE ? "include" : "exclude");
-    return element;
-}
-
-std::string ExcludeList(const std::vector<std::string>& properties)
-{
-    std::string list = "    <excludelist>\n";
-    for (const std::string& property : properties) {
-        list += "      <value>";
-        TValueXml::AppendEscaped(list, property);
-        list += "</value>\n";
-    }
-    return list + "    </excludelist>\n";
-}
-
 std::string ElementWith(const std::string& className, TCIMDiffEngine::propType treatment, const std::vector<std::string>& excluded)
 {
-    const std::string start = StartOfElement(className, treatment);
-    return excluded.empty() ? start + "/>\n" : start + ">\n" + ExcludeList(excluded) + "  </class>\n";
+    return WriteRulesElement({className, treatment == TCIMDiffEngine::INCLUDE ? "include" : "exclude", {}, {}, excluded});
 }
 
 std::string WholeFile(const std::string& element)
 {
-    return "<DifftoolSpec version=\"1.0\">\n" + ElementWith(kRootClassName, TCIMDiffEngine::INCLUDE, {}) + element + kFileEnd +
-           "\n";
+    return WriteRulesDocument(ElementWith(kRootClassName, TCIMDiffEngine::INCLUDE, {}) + element);
 }
 
 std::string Line(unsigned line)
@@ -98,7 +75,7 @@ TRuleProposals::TProposal TRuleProposals::ForProperty(const std::string& classNa
     if (!hasOwn || (decision.fromClass != className && WouldLeaveOut(className, property, added))) {
         return {what, AtEnd(), added};
     }
-    const std::string list = ExcludeList({property});
+    const std::string list = WriteRulesList("excludelist", {property});
     const std::string of = decision.fromClass == className
                                ? what
                                : "Leaves " + property + " of " + decision.fromClass + " out, and of the classes below it.";
@@ -155,7 +132,7 @@ TRuleProposals::TElements TRuleProposals::ElementsOf(const std::string& classNam
 // Asks the plug-in.
 bool TRuleProposals::WouldLeaveOut(const std::string& className, const std::string& property, const std::string& element) const
 {
-    const std::size_t end = fText.text.rfind(kFileEnd);
+    const std::size_t end = fText.text.rfind(kRulesDocumentEnd);
     if (end == std::string::npos) {
         return false;
     }
@@ -167,7 +144,7 @@ bool TRuleProposals::WouldLeaveOut(const std::string& className, const std::stri
 
 std::string TRuleProposals::AtEnd() const
 {
-    return "In " + fReport.rules + ", put this element at the end, in front of " + kFileEnd + ".";
+    return "In " + fReport.rules + ", put this element at the end, in front of " + kRulesDocumentEnd + ".";
 }
 
 }  // namespace NORVZEL20
