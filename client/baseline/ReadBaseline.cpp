@@ -58,7 +58,8 @@ class TBaselineParser {
             fComments.emplace_back(text.substr(begin));
         } else if (const char* const mark = FindMergeMark(text)) {
             Refuse(1, "found " + std::string(mark) +
-                          " of a merge that is not finished; keep the entries of both sides, and remove the lines with <<<<<<<, "
+                          " of a merge that is not finished; keep the entries of both sides, but one for a difference, and remove "
+                          "the lines with <<<<<<<, "
                           "======= and >>>>>>>");
         } else if (IsMark(text.substr(begin))) {
             CheckVersion(text.substr(begin + sizeof kBaselineMark - 1), begin + sizeof kBaselineMark);
