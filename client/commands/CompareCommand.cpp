@@ -17,8 +17,6 @@
 #include "client/report/DescribeNothingCompared.h"
 #include "client/report/TResultOutput.h"
 #include "client/rules/ReadRules.h"
-#include "client/text/DisplayText.h"
-#include "embedded/value/TUtf8.h"
 
 namespace NORVZEL20 {
 
@@ -30,18 +28,6 @@ constexpr std::size_t kMostLinesOnTerminal = 200;
 bool IsBesideBaseline(const TBaselineOptions& options)
 {
     return !options.accept.empty() || !options.baseline.empty();
-}
-
-// A reason is the end of a line of the file.
-void CheckReason(const std::string& reason)
-{
-    const std::size_t invalid = TUtf8::FindInvalid(reason);
-    const bool hasControl =
-        std::any_of(reason.begin(), reason.end(), [](char one) { return (one >= 0 && one < ' ') || one == '\x7f'; });
-    if (hasControl || invalid < reason.size()) {
-        throw TClientError("found --reason " + QuoteForDisplay(reason) +
-                           ", expected one line of text in UTF-8; leave out what is shown as " + "\\n or the like");
-    }
 }
 
 // What needs no file to be found wrong.
