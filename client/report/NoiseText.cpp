@@ -15,6 +15,7 @@
 #include <algorithm>
 #include <boost/algorithm/string/join.hpp>
 
+#include "client/findings/DeclaredWords.h"
 #include "client/report/ChangeText.h"
 #include "client/report/DescribeAgreement.h"
 #include "client/report/DisplayLabels.h"
@@ -96,7 +97,11 @@ std::string Rest(const TNoise& noise, const TUnexplained& rest)
 std::string Example(const TNoise& noise, const TNoiseRule& rule)
 {
     constexpr std::size_t kLongestExample = 60;
-    const std::string text = ChangeText(rule.example, NamesOf(noise.before), noise.before.labels.size() == 2);
+    const TValueWords words = DeclaredWords(*noise.before.inventories, rule.className, rule.example.property);
+    TChangeStyle style;
+    style.isPair = noise.before.labels.size() == 2;
+    style.words = &words;
+    const std::string text = ChangeText(rule.example, NamesOf(noise.before), style);
     return std::string(TUtf8::Shorten(text, kLongestExample)) + (text.size() > kLongestExample ? "..." : "");
 }
 
@@ -137,6 +142,11 @@ std::string WriteNoiseText(const TNoise& noise, const TTextOptions& options)
         rows.emplace_back(EscapeForDisplay(NoiseOption(rule)), NoiseEvidence(noise, rule));
     }
     text += (rows.empty() ? "" : "\n") + Table(rows);
+    if (std::any_of(noise.rules.begin(), noise.rules.end(), [](const TNoiseRule& rule) { return !rule.isForTree; })) {
+        text += "The options reach the classes below a class as well, also where a rule is for the class alone; the rules that "
+                "--save-rules "
+                "writes do not.\n";
+    }
     rows.clear();
     for (const TUnexplained& rest : noise.rest) {
         rows.emplace_back(EscapeForDisplay(rest.className), Rest(noise, rest));

@@ -94,6 +94,44 @@ TEST_F(NoiseTest, EachRuleComesWithWhatSpeaksForIt)
     EXPECT_EQ(1, fStatus);
 }
 
+const std::string kMapDeclarations = "<QUALIFIER.DECLARATION NAME=\"ValueMap\" TYPE=\"string\" ISARRAY=\"true\"/>"
+                                     "<QUALIFIER.DECLARATION NAME=\"Values\" TYPE=\"string\" ISARRAY=\"true\"/>";
+
+/// Device and, below it, Fan. Only devices that are no fans have another load and another state each time.
+std::string LoadInventory(const std::string& load, const std::string& state)
+{
+    const std::string names =
+        "<QUALIFIER NAME=\"ValueMap\" TYPE=\"string\"><VALUE.ARRAY><VALUE>2</VALUE><VALUE>3</VALUE></VALUE.ARRAY>"
+        "</QUALIFIER><QUALIFIER NAME=\"Values\" TYPE=\"string\"><VALUE.ARRAY><VALUE>OK</VALUE>"
+        "<VALUE>Degraded</VALUE></VALUE.ARRAY></QUALIFIER>";
+    const std::string properties = Value("Load", load, "uint32") + Value("State", state, "uint16");
+    return Document(kMapDeclarations + System() +
+                    Class("Device", "", KeyProperty("Id") + Declaration("Load", "uint32") + Declaration("State", "uint16", names)) +
+                    Class("Fan", "Device", "") + Instance("Device", Value("Id", "d") + properties) +
+                    Instance("Fan", Value("Id", "f") + Value("Load", "1", "uint32") + Value("State", "2", "uint16")));
+}
+
+TEST_F(NoiseTest, TheReportSaysWhatTheOptionsReachAndUsesTheWordsOfOtherReports)
+{
+    fPaths = {"a=" + Scratch("a.xml", LoadInventory("5", "2")), "b=" + Scratch("b.xml", LoadInventory("6", "3"))};
+    const std::string text = Noise();
+    EXPECT_EQ(
+        "2 differences between a and b; 2 rules leave all of them out\n"
+        "\n"
+        "--exclude Device.Load   changed in 1 of 1 instance in 1 of 1 comparison (the class alone, not those below it): 5 -> 6\n"
+        "--exclude Device.State  changed in 1 of 1 instance in 1 of 1 comparison (the class alone, not those below it): 2 OK -> 3 "
+        "Degraded\n"
+        "The options reach the classes below a class as well, also where a rule is for the class alone; the rules that "
+        "--save-rules writes do not.\n",
+        text.substr(0, text.rfind("\n\n") + 1));
+    const std::string rules = Scratch("noise.xml", "");
+    Noise({"--save-rules", rules});
+    fPaths[1] =
+        "c=" + Scratch("c.xml", LoadInventory("6", "3").replace(LoadInventory("6", "3").rfind("<VALUE>1<"), 9, "<VALUE>9<"));
+    EXPECT_NE(std::string::npos, With("compare", {"--spec", rules}).find("f.Load: 1 -> 9")) << fOut;
+    EXPECT_EQ(std::string::npos, With("compare", {"--exclude", "Device.Load"}).find(".Load: ")) << fOut;
+}
+
 TEST_F(NoiseTest, SavedRulesHoldTheEvidence)
 {
     TakeThree();
