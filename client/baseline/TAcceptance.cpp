@@ -1,10 +1,17 @@
 #include "client/baseline/TAcceptance.h"
 
 #include <algorithm>
+#include <iterator>
+#include <string_view>
+
+#include "client/baseline/ForEachUnquoted.h"
+#include "embedded/value/TNameText.h"
 
 namespace NORVZEL20 {
 
 namespace {
+
+using TKeyNames = std::set<std::string, TNameText::TLess>;
 
 bool IsBefore(const TAcceptedDifference::TValue& one, const TAcceptedDifference::TValue& other)
 {
@@ -14,6 +21,25 @@ bool IsBefore(const TAcceptedDifference::TValue& one, const TAcceptedDifference:
 std::string ClassOf(const TAcceptedDifference& entry)
 {
     return entry.instance.substr(0, entry.instance.find('.'));
+}
+
+// Of Disk.Id="sda",Bus=1: Id and Bus.
+TKeyNames KeyNamesOf(const std::string& instance)
+{
+    TKeyNames names;
+    std::size_t begin = instance.find('.');
+    while (begin < instance.size()) {
+        ++begin;
+        names.insert(instance.substr(begin, instance.find('=', begin) - begin));
+        std::size_t end = std::string::npos;
+        const std::string_view rest = std::string_view(instance).substr(begin);
+        ForEachUnquoted(rest, [&](std::size_t at) {
+            end = rest[at] == ',' ? begin + at : end;
+            return end == std::string::npos;
+        });
+        begin = end;
+    }
+    return names;
 }
 
 }  // namespace
@@ -43,7 +69,29 @@ TAcceptance::TVerdict TAcceptance::Judge(const TDifference& difference, const TD
 bool TAcceptance::IsCompared(const TAcceptedDifference& entry) const
 {
     const TNames& compared = ComparedOf(ClassOf(entry));
+    if (!compared.empty() && !IsKeyed(entry)) {
+        return false;
+    }
     return entry.kind == TDifference::kChanged ? compared.count(entry.values.front().property) > 0 : !compared.empty();
+}
+
+// Whether the entry names the keys by which some inventory of the run knows instances. It does not if the rules excluded other keys
+// when it was accepted.
+bool TAcceptance::IsKeyed(const TAcceptedDifference& entry) const
+{
+    const std::string className = ClassOf(entry);
+    const TKeyNames named = KeyNamesOf(entry.instance);
+    return std::any_of(fReport.inventories->begin(), fReport.inventories->end(), [&](const TInventory& inventory) {
+        const boost::shared_ptr<TInMemClass> cls = inventory.ns->FindClass(className);
+        TKeyNames names;
+        for (const std::uint32_t slot : cls ? cls->GetLayout().GetKeys() : std::vector<std::uint32_t>()) {
+            const std::string key = cls->GetLayout().GetDecl(slot).GetName();
+            if (entry.kind == TDifference::kOnlyInReference || !fReport.meaning->ExcludesKey(className, key)) {
+                names.insert(key);
+            }
+        }
+        return cls && std::equal(names.begin(), names.end(), named.begin(), named.end(), &TNameText::Equal);
+    });
 }
 
 const TAcceptance::TNames& TAcceptance::ComparedOf(const std::string& className) const

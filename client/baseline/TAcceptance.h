@@ -45,6 +45,7 @@ class TAcceptance {
   private:
     using TNames = std::set<std::string>;
 
+    bool IsKeyed(const TAcceptedDifference& entry) const;
     const TNames& ComparedOf(const std::string& className) const;
     TNames FindCompared(const std::string& className) const;
 

@@ -82,6 +82,25 @@ TEST_F(NotComparedTest, OfAnInstanceThatIsAnotherNowThePropertiesThatWereLeftOut
     EXPECT_EQ("+ Disk.Id=\"sdb\" Model: \"A\", Size: uint16 3 in web02\n", Entries());
 }
 
+TEST_F(NotComparedTest, WhatWasAcceptedByOtherKeysIsNotGone)
+{
+    const auto disk = [](const char* id, const char* bus, const char* size) {
+        return Instance("Disk", Value("Id", id) + Value("Bus", bus) + Value("Size", size, "uint16"));
+    };
+    const std::string declared = Class("Disk", "", KeyProperty("Id") + KeyProperty("Bus") + Declaration("Size", "uint16"));
+    SystemWith("web01", declared + disk("sda", "a,b", "1") + disk("sdb", "2", "1"));
+    SystemWith("web02", declared + disk("sda", "a,b", "2") + disk("sdc", "3", "1"));
+    Accept();
+    const std::string byBoth = Entries();
+    const std::string since = Since({"--exclude-key", "Bus"});
+    EXPECT_EQ("Compared with base.txt: 2 new; 1 accepted\n"
+              "2 accepted differences are for what was not compared: + Disk.Bus=\"3\",Id=\"sdc\" in web02, ...\n",
+              since.substr(since.find("Compared with")));
+    Accept({"--exclude-key", "Bus"});
+    EXPECT_NE(byBoth, Entries());
+    EXPECT_NE(std::string::npos, Since().find("3 accepted differences.\n")) << fReport;
+}
+
 TEST_F(NotComparedTest, EntriesForTheReferenceAreSaidToBeThat)
 {
     System("web02", {{"sda", "2"}, {"sdb", "5"}});
