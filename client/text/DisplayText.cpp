@@ -57,6 +57,17 @@ bool Contains(std::string_view text, std::string_view part)
     return text.find(part) != std::string_view::npos;
 }
 
+// Whether the label reads as what reports write for several inventories: a word, or a range such as "web01..04".
+bool StandsForSeveral(std::string_view label)
+{
+    if (label == "all" || label == "others") {
+        return true;
+    }
+    const std::size_t dots = label.rfind("..");
+    return dots != std::string_view::npos && dots + 2 < label.size() &&
+           label.find_first_not_of("0123456789", dots + 2) == std::string_view::npos;
+}
+
 // Whether the text needs no quotes.
 bool StandsBare(std::string_view text, const std::string& escaped)
 {
@@ -90,7 +101,7 @@ std::string EscapeForDisplay(std::string_view text)
 std::string DisplayLabel(std::string_view label)
 {
     const bool needsQuotes = label.empty() || label.find_first_of(" \"") != std::string_view::npos ||
-                             std::string_view(",:;.").find(label.back()) != std::string_view::npos;
+                             std::string_view(",:;.").find(label.back()) != std::string_view::npos || StandsForSeveral(label);
     if (!needsQuotes) {
         return EscapeForDisplay(label);
     }

@@ -13,8 +13,9 @@ namespace NORVZEL20 {
 std::string EscapeForDisplay(std::string_view text);
 
 /// The label of an inventory (see MakeInventoryLabels) as a part of a sentence or a list. A label is put in double quotes if it
-/// holds a blank or a quote or ends in a punctuation mark, because the text around it could then be taken for a part of it. Within
-/// the quotes a backslash stands before each quote. Different labels stay different.
+/// holds a blank or a quote or ends in a punctuation mark, because the text around it could then be taken for a part of it, and if
+/// it reads as several inventories do: `all`, `others`, `web01..04`. Within the quotes a backslash stands before each quote.
+/// Different labels stay different.
 std::string DisplayLabel(std::string_view label);
 
 /// Text in double quotes, with a backslash before each quote and backslash of its own, and escaped as by EscapeForDisplay.

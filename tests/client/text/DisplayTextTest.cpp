@@ -68,12 +68,26 @@ TEST(DisplayLabel, IsQuotedIfItCouldBeTakenForSeveral)
         const char* label;
         const char* shown;
     } rows[] = {
-        {"web01", "web01"},         {"old/web01.xml#2", "old/web01.xml#2"},
-        {"caf\\xe9", "caf\\xe9"},   {"a,b", "a,b"},
-        {"a, b", "\"a, b\""},       {"a and b", "\"a and b\""},
-        {"web 01", "\"web 01\""},   {"a,", "\"a,\""},
-        {"a:", "\"a:\""},           {"a.", "\"a.\""},
-        {"\"a\"", "\"\\\"a\\\"\""}, {"", "\"\""},
+        {"web01", "web01"},
+        {"old/web01.xml#2", "old/web01.xml#2"},
+        {"caf\\xe9", "caf\\xe9"},
+        {"a,b", "a,b"},
+        {"a, b", "\"a, b\""},
+        {"a and b", "\"a and b\""},
+        {"web 01", "\"web 01\""},
+        {"a,", "\"a,\""},
+        {"a:", "\"a:\""},
+        {"a.", "\"a.\""},
+        {"\"a\"", "\"\\\"a\\\"\""},
+        {"", "\"\""},
+        {"all", "\"all\""},
+        {"others", "\"others\""},
+        {"ALL", "ALL"},
+        {"allweb", "allweb"},
+        {"web01..04", "\"web01..04\""},
+        {"..1", "\"..1\""},
+        {"../web01", "../web01"},
+        {"../7", "../7"},
     };
     for (const auto& row : rows) {
         EXPECT_EQ(row.shown, DisplayLabel(row.label));
