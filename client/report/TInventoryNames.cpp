@@ -66,14 +66,16 @@ std::string TInventoryNames::WhoHas(const std::vector<std::size_t>& inventories)
                                                         : "only in " + List(inventories);
 }
 
-// Whether they are all others, or so many that it is shorter to name those that are not among them.
+// Whether they are all others, or so many that those are odd that are not among them, the reference included. Who is odd is named.
 bool TInventoryNames::AreNearlyAll(const std::vector<std::size_t>& inventories) const
 {
     const std::size_t others = fLabels.size() - 1;
     if (inventories.front() == 0 || others < kFewestForAll) {
         return false;
     }
-    return inventories.size() == others || (others >= kFewestForAllBut && others - inventories.size() <= kMostExceptions);
+    const std::size_t exceptions = others - inventories.size();
+    const std::size_t odd = exceptions + (fHasMajority ? 0 : 1);
+    return exceptions == 0 || (others >= kFewestForAllBut && exceptions <= kMostExceptions && odd < inventories.size());
 }
 
 std::vector<std::size_t> TInventoryNames::Others(const std::vector<std::size_t>& inventories, std::size_t first) const

@@ -207,7 +207,7 @@ TEST_F(FleetReportTest, WhatMostHaveIsNoInventory)
     }
     for (const char* const format : {"text", "markdown"}) {
         const std::string report = Compare(4, {"--reference", "majority", "-o", format});
-        EXPECT_NE(std::string::npos, report.find("only in web01, web02: www")) << report;
+        EXPECT_NE(std::string::npos, report.find("missing in web03, web04: www")) << report;
     }
 }
 
