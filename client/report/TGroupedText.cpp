@@ -68,14 +68,22 @@ std::string TGroupedText::Summary() const
     const std::size_t others = fReport.labels.size() - 1;
     const auto differ = static_cast<std::size_t>(
         std::count_if(fFindings.differences.begin(), fFindings.differences.end(), [](std::size_t count) { return count > 0; }));
+    const std::string verb = std::string(differ == 1 ? " differs" : " differ") + (IsAllShown() ? "" : " in these");
     if (fReport.run) {
         return std::to_string(others) + " inventories against what most of them have: " + Counted(total, "difference") + "; " +
-               (differ == others ? "all" : std::to_string(differ)) + (differ == 1 ? " differs" : " differ");
+               (differ == others ? "all" : std::to_string(differ)) + verb;
     }
     return DisplayLabel(fReport.labels[0]) + " against " + std::to_string(others) + " others: " + Counted(total, "difference") +
            "; " +
-           (differ == others ? (others == 2 ? "both" : "all " + std::to_string(others)) + " differ"
-                             : std::to_string(differ) + " of " + std::to_string(others) + (differ == 1 ? " differs" : " differ"));
+           (differ == others ? (others == 2 ? "both" : "all " + std::to_string(others))
+                             : std::to_string(differ) + " of " + std::to_string(others)) +
+           verb;
+}
+
+// Otherwise inventories may differ in what is not shown.
+bool TGroupedText::IsAllShown() const
+{
+    return fReport.notShown.counts.GetTotal() == 0;
 }
 
 // "-1 +2 instances, 2 values"

@@ -25,6 +25,7 @@ class TGroupedText {
     std::string Summary() const;
 
   private:
+    bool IsAllShown() const;
     std::string Counts() const;
     std::string WhoDiffers() const;
     std::string Findings() const;

@@ -142,6 +142,18 @@ const char kElevenDrifts[] = "KALMO_Disk            ~1   sda.Settings.Speed: 100
 const char kWhoDrifted[] = "    4  web21..23        1  web03, web07, web09, web12, web15, web18, web30, web36\n"
                            "\n";
 
+TEST_F(FleetReportTest, WhoDiffersIsSaidOfWhatIsShown)
+{
+    DriftOfEleven();
+    const auto verdict = [](const std::string& report) { return report.substr(0, report.find('\n')); };
+    EXPECT_EQ("web01 against 39 others: 1 difference; 1 of 39 differs in these; 1 missing instance, 10 changed values not shown "
+              "(--only +)",
+              verdict(Compare(40, {"--only", "+"})));
+    EXPECT_EQ("40 inventories against what most of them have: 2 differences; 2 differ in these; 10 changed values not shown "
+              "(--only +,-)",
+              verdict(Compare(40, {"--only", "+,-", "--reference", "majority"})));
+}
+
 TEST_F(FleetReportTest, OfFortySystemsShowsEachDrift)
 {
     DriftOfEleven();
