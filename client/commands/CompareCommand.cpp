@@ -61,6 +61,14 @@ std::optional<TBaseline> ReadBaselineIfNamed(const TBaselineOptions& options)
     return options.accept.empty() ? std::nullopt : std::make_optional(ReadBaselineIfAny(options.accept));
 }
 
+// Whether properties are asked for by their names, as reports advise for those of large groups. These are then shown whole.
+bool AreNamed(const std::vector<std::string>& properties)
+{
+    return !properties.empty() && std::all_of(properties.begin(), properties.end(), [](const std::string& name) {
+        return name.find_first_of("*?") == std::string::npos;
+    });
+}
+
 // With the colours, the width and the number of lines that fit where the report goes.
 TTextOptions TextOptions(const TCompareOptions& options, const IConsole& console)
 {
@@ -72,7 +80,8 @@ TTextOptions TextOptions(const TCompareOptions& options, const IConsole& console
         text.width = std::max(width, kLeastWidth);
     }
     text.hasWholeGroups = !options.selection.properties.empty();
-    if (text.mostLines == 0 && isOnConsole && console.IsTerminal()) {
+    text.isLimitChosen = text.mostLines > 0;
+    if (!text.isLimitChosen && !AreNamed(options.selection.properties) && isOnConsole && console.IsTerminal()) {
         text.mostLines = kMostLinesOnTerminal;
     }
     return text;

@@ -236,10 +236,10 @@ std::string TClassLines::First(const TChangeFinding& change)
     return change.names.front() + (change.instances == 1 ? std::string() : " and " + Counted(change.instances - 1, "other"));
 }
 
-// The option shows a group whole that is no larger than what is kept of it.
+// The option shows a group whole that is no larger than what is kept of it, unless the lines are limited then too.
 std::string TClassLines::MoreChanges(const TPropertyFinding& property) const
 {
-    const bool isEnough = property.changes <= kMostExamples && !fOptions.hasWholeGroups;
+    const bool isEnough = property.changes <= kMostExamples && !fOptions.hasWholeGroups && !fOptions.isLimitChosen;
     const std::string name = property.property.substr(0, property.property.find('.'));
     return "... " + std::to_string(property.changes - 1) + " more (" +
            (isEnough ? "--property " + EscapeForDisplay(QuoteForShell(name)) : "--detail") + ")";

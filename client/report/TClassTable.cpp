@@ -58,6 +58,15 @@ std::size_t CountLines(const std::vector<std::vector<std::string>>& classes)
 
 }  // namespace
 
+std::vector<std::size_t> TClassTable::MostMembers(const TTextOptions& options)
+{
+    std::vector<std::size_t> steps{8, 4, 2, 1};
+    if (options.hasWholeGroups) {
+        steps.insert(steps.begin(), kMostExamples);
+    }
+    return steps;
+}
+
 std::vector<std::string> TClassTable::Write(std::size_t most) const
 {
     return Join(WriteClasses(most));
@@ -65,12 +74,8 @@ std::vector<std::string> TClassTable::Write(std::size_t most) const
 
 std::vector<std::string> TClassTable::WriteWithin(std::size_t mostLines) const
 {
-    std::vector<std::size_t> steps(std::begin(kMostMembers), std::end(kMostMembers));
-    if (fOptions.hasWholeGroups) {
-        steps.insert(steps.begin(), kMostExamples);
-    }
     std::vector<TLines> classes;
-    for (const std::size_t most : steps) {
+    for (const std::size_t most : MostMembers(fOptions)) {
         classes = WriteClasses(most);
         if (mostLines == 0 || CountLines(classes) <= mostLines) {
             return Join(classes);

@@ -26,8 +26,8 @@ class TClassTable {
     /// needed, then the classes with most lines become one line each, with their counts.
     std::vector<std::string> WriteWithin(std::size_t mostLines) const;
 
-    /// How many members of a group are shown: as many as possible, in these steps, so that the lines fit.
-    static constexpr std::size_t kMostMembers[] = {8, 4, 2, 1};
+    /// How many members of a group are shown: the first of these with which the lines fit.
+    static std::vector<std::size_t> MostMembers(const TTextOptions& options);
 
   private:
     using TLines = std::vector<std::string>;

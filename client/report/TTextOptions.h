@@ -15,6 +15,7 @@ struct TTextOptions {
     bool hasWholeGroups = false;    ///< groups whole, if the lines are not too many: few properties were asked for
     std::size_t width = 120;        ///< columns at which contents are cut; 0 for no limit
     std::size_t mostLines = 0;      ///< how long the findings may be if groups are shortened; 0 for no limit
+    bool isLimitChosen = false;     ///< whether a person chose that, so that it also holds for the properties that are asked for
 };
 
 }  // namespace NORVZEL20

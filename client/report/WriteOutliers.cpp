@@ -66,7 +66,7 @@ void CollapseBlocks(std::vector<TBlock>& blocks, std::size_t mostLines)
 std::string WriteOutliers(const std::vector<TOutliers>& outliers, const TInventoryNames& names, const TTextOptions& options)
 {
     std::vector<TBlock> blocks;
-    for (const std::size_t most : TClassTable::kMostMembers) {
+    for (const std::size_t most : TClassTable::MostMembers(options)) {
         blocks.clear();
         for (const TOutliers& group : outliers) {
             blocks.push_back(WriteBlock(group, names, options, most));

@@ -138,7 +138,7 @@ TEST_F(GroupedReportTest, ALimitShortensGroupsButLeavesNoneOut)
     System("a", Packages(8, "1") + Service("ssh", "TRUE"));
     System("b", Packages(8, "2") + Service("ssh", "FALSE"));
     EXPECT_EQ("Package  ~ Version in 8 instances, 8 distinct changes\n"
-              "           p1: 1-1 -> 2-1   ... 7 more (--property Version)\n"
+              "           p1: 1-1 -> 2-1   ... 7 more (--detail)\n"
               "Service  ~ ssh.Started: TRUE -> FALSE\n",
               Findings({"--limit", "3"}));
     EXPECT_EQ(Findings(), Findings({"--limit", "9"}));
