@@ -129,6 +129,17 @@ std::string Shown(const TCIMValue& value, const TValueDifference& change, const 
     return value.GetType().IsArray() ? ListedText(value) : InlineText(value);
 }
 
+// The reference's value, then those of the groups that were chosen, cut around what differs.
+std::vector<std::string> ValuesOf(const TValueDifference& change, const std::vector<std::size_t>& chosen, const TChangeStyle& style)
+{
+    const TValueTexts texts(change, true);
+    std::vector<std::string> values{Shown(change.reference, change, texts.GetReference(), style.words)};
+    for (const std::size_t i : chosen) {
+        values.push_back(Shown(change.others[i].value, change, texts.GetOther(i), style.words));
+    }
+    return style.isWhole ? values : CutAround(values);
+}
+
 std::string OfGroup(const TValueDifference::TGroup& group, const std::string& text, const TInventoryNames& names, bool isPair)
 {
     return isPair ? text : text + " (" + names.List(group.inventories) + ")";
@@ -152,27 +163,16 @@ std::vector<std::size_t> Choose(const std::vector<TValueDifference::TGroup>& gro
 
 std::string ChangeText(const TValueDifference& change, const TInventoryNames& names, const TChangeStyle& style)
 {
-    const TValueTexts texts(change, true);
-    const std::string reference = Shown(change.reference, change, texts.GetReference(), style.words);
-    if (change.others.size() == 1) {
-        const TValueDifference::TGroup& group = change.others.front();
-        const std::string elements = ElementsChanged(change.reference, group.value);
-        if (!elements.empty()) {
-            return OfGroup(group, elements, names, style.isPair);
-        }
-        const std::string other = Shown(group.value, change, texts.GetOther(0), style.words);
-        const auto [before, after] = style.isWhole ? std::make_pair(reference, other) : CutAround(reference, other);
-        return before + kBeforeNewValue + OfGroup(group, after, names, style.isPair);
-    }
+    const std::vector<std::size_t> chosen = Choose(change.others, style.mostValues);
     const std::vector<std::string> elements = ElementsChangedInAll(change);
+    const std::vector<std::string> values = elements.empty() ? ValuesOf(change, chosen, style) : std::vector<std::string>();
     std::vector<std::string> groups;
-    for (const std::size_t i : Choose(change.others, style.mostValues)) {
-        const std::string text =
-            elements.empty() ? Shown(change.others[i].value, change, texts.GetOther(i), style.words) : elements[i];
-        groups.push_back(OfGroup(change.others[i], text, names, style.isPair));
+    for (const std::size_t i : chosen) {
+        groups.push_back(
+            OfGroup(change.others[i], elements.empty() ? values[groups.size() + 1] : elements[i], names, style.isPair));
     }
     const std::size_t rest = change.others.size() - groups.size();
-    return (elements.empty() ? reference + kBeforeNewValue : std::string()) + boost::algorithm::join(groups, kBetweenValues) +
+    return (elements.empty() ? values.front() + kBeforeNewValue : std::string()) + boost::algorithm::join(groups, kBetweenValues) +
            (rest > 0 ? "   ... " + Counted(rest, "more value", "more values") + " (--detail)" : std::string());
 }
 

@@ -36,20 +36,54 @@ std::string Cut(const std::string& text, std::size_t common, std::size_t tail)
     return (begin > 0 ? kCut : "") + text.substr(begin, end - begin) + (end < text.size() ? kCut : "");
 }
 
+using TTexts = std::vector<const std::string*>;
+
+// How many bytes all have in common at their beginning.
+std::size_t CommonBegin(const TTexts& texts, std::size_t most)
+{
+    for (const std::string* const text : texts) {
+        const auto end = texts.front()->begin() + static_cast<std::ptrdiff_t>(most);
+        most = static_cast<std::size_t>(std::mismatch(texts.front()->begin(), end, text->begin()).first - texts.front()->begin());
+    }
+    return most;
+}
+
+// The same at their end.
+std::size_t CommonEnd(const TTexts& texts, std::size_t most)
+{
+    for (const std::string* const text : texts) {
+        const auto end = texts.front()->rbegin() + static_cast<std::ptrdiff_t>(most);
+        most =
+            static_cast<std::size_t>(std::mismatch(texts.front()->rbegin(), end, text->rbegin()).first - texts.front()->rbegin());
+    }
+    return most;
+}
+
 }  // namespace
 
-std::pair<std::string, std::string> CutAround(const std::string& one, const std::string& other)
+// A short text beside several long ones stays whole: little or nothing would be common to all, as if one of them is NULL.
+std::vector<std::string> CutAround(const std::vector<std::string>& texts)
 {
-    if (std::max(one.size(), other.size()) <= kLong) {
-        return {one, other};
+    const auto isLong = [](const std::string& text) { return text.size() > kLong; };
+    const auto countLong = std::count_if(texts.begin(), texts.end(), isLong);
+    if (countLong == 0) {
+        return texts;
     }
-    const std::size_t shorter = std::min(one.size(), other.size());
-    const auto differ = std::mismatch(one.begin(), one.begin() + static_cast<std::ptrdiff_t>(shorter), other.begin());
-    const auto common = static_cast<std::size_t>(differ.first - one.begin());
-    const auto rest = static_cast<std::ptrdiff_t>(shorter - common);
-    const auto tail =
-        static_cast<std::size_t>(std::mismatch(one.rbegin(), one.rbegin() + rest, other.rbegin()).first - one.rbegin());
-    return {Cut(one, common, tail), Cut(other, common, tail)};
+    TTexts cut;
+    std::size_t shortest = static_cast<std::size_t>(-1);
+    for (const std::string& text : texts) {
+        if (countLong == 1 || isLong(text)) {
+            cut.push_back(&text);
+            shortest = std::min(shortest, text.size());
+        }
+    }
+    const std::size_t common = CommonBegin(cut, shortest);
+    const std::size_t tail = CommonEnd(cut, shortest - common);
+    std::vector<std::string> all;
+    for (const std::string& text : texts) {
+        all.push_back(countLong == 1 || isLong(text) ? Cut(text, common, tail) : text);
+    }
+    return all;
 }
 
 }  // namespace NORVZEL20

@@ -272,6 +272,20 @@ TEST_F(GroupedReportTest, OfLongTextsTheChangeIsShown)
     EXPECT_EQ("Package  ~ p.Vendor: ...n, until it ends in the end... -> ...n, until it stops in the end...\n", Findings());
 }
 
+TEST_F(GroupedReportTest, OfLongTextsOfSeveralTheChangesAreShown)
+{
+    const std::string text = "A description of a package that goes on and on, until ";
+    System("a", Package("p", "1", text + "it ends in the end of the text that is long"));
+    System("b", Package("p", "1", text + "it stops in the end of the text that is long"));
+    System("c", Package("p", "1", text + "it stays in the end of the text that is long"));
+    System("d", Package("p", "1", "none"));
+    EXPECT_EQ(
+        "Package  ~1   p.Vendor: ...n, until it ends in the end... -> ...n, until it stops in the end... (b) / ...n, until it "
+        "stays in the end... (c) / none (d)\n",
+        Findings());
+    EXPECT_NE(std::string::npos, Findings({"--full"}).find(text + "it stops in the end of the text that is long\" (b)"));
+}
+
 TEST_F(GroupedReportTest, WithoutDifferencesSaysSoInTwoLines)
 {
     System("a", Service("ssh", "TRUE"));
