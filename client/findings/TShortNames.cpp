@@ -4,6 +4,7 @@
 #include <boost/algorithm/string/predicate.hpp>
 #include <iterator>
 
+#include "client/findings/FindTellingKey.h"
 #include "client/text/DisplayText.h"
 #include "client/text/EmbeddedText.h"
 #include "client/text/InlineText.h"
@@ -34,7 +35,15 @@ std::string TShortNames::Of(const TDifference& difference)
     if (fAreWhole) {
         return EscapeForDisplay(difference.GetKeyText());
     }
-    return Join(difference.className, difference.keys);
+    const TKeys left = KeysLeft(difference.className, difference.keys);
+    if (left.size() > 1) {
+        const std::string& telling = TellingKey(difference.className, left);
+        const auto found = std::find_if(left.begin(), left.end(), [&telling](const auto& key) { return key.first == telling; });
+        if (found != left.end() && IsText(found->second)) {
+            return InlineText(found->second);
+        }
+    }
+    return Join(difference.className, left);
 }
 
 const TDistinctKeys& TShortNames::Distinct(const std::string& className)
@@ -43,8 +52,22 @@ const TDistinctKeys& TShortNames::Distinct(const std::string& className)
     return known != fClasses.end() ? known->second : fClasses.try_emplace(className, fInventories, className).first->second;
 }
 
-// If no key tells instances apart, there is only one of them. It then goes by the keys that do not merely repeat a class.
-std::string TShortNames::Join(const std::string& className, const TKeys& keys)
+// The keys that are left are the same for all instances of the class.
+const std::string& TShortNames::TellingKey(const std::string& className, const TKeys& left)
+{
+    const auto known = fTellingKeys.find(className);
+    if (known != fTellingKeys.end()) {
+        return known->second;
+    }
+    std::vector<std::string> names;
+    for (const auto& key : left) {
+        names.push_back(key.first);
+    }
+    return fTellingKeys.emplace(className, FindTellingKey(fInventories, className, names)).first->second;
+}
+
+// If all keys are common, there is only one instance. It then goes by the keys that do not merely repeat a class.
+TShortNames::TKeys TShortNames::KeysLeft(const std::string& className, const TKeys& keys)
 {
     const TDistinctKeys& distinct = Distinct(className);
     TKeys left;
@@ -56,9 +79,12 @@ std::string TShortNames::Join(const std::string& className, const TKeys& keys)
     if (left.empty()) {
         std::copy_if(keys.begin(), keys.end(), std::back_inserter(left), [](const auto& key) { return !RepeatsClass(key.first); });
     }
-    if (left.empty()) {
-        left = keys;
-    }
+    return left.empty() ? keys : left;
+}
+
+std::string TShortNames::Join(const std::string& className, const TKeys& left)
+{
+    const TDistinctKeys& distinct = Distinct(className);
     if (left.size() == 1 && IsText(left.front().second)) {
         return Text(distinct, left.front().first, left.front().second);
     }
@@ -85,7 +111,7 @@ std::string TShortNames::Text(const TDistinctKeys& distinct, const std::string& 
     if (keys.empty() || !path.GetNamespaceName().empty() || !path.GetHost().empty()) {
         return DisplayContents(value);
     }
-    const std::string name = Join(path.GetClassName(), keys);
+    const std::string name = Join(path.GetClassName(), KeysLeft(path.GetClassName(), keys));
     // Several keys of its own stand in brackets, so that they are not taken for those around it.
     const std::string inner = name.find(',') == std::string::npos ? name : "(" + name + ")";
     return distinct.HasCommonClass(key) ? inner : EscapeForDisplay(path.GetClassName()) + ":" + inner;

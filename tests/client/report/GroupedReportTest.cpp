@@ -153,11 +153,13 @@ TEST_F(GroupedReportTest, KeysThatAllInstancesShareAreLeftOutOfNames)
 
 TEST_F(GroupedReportTest, AKeyThatTellsAnyTwoInstancesApartStays)
 {
-    const std::string other = Instance("Service", Value("CreationClassName", "Other") + Value("Name", "x"));
+    const auto other = [](const std::string& name) {
+        return Instance("Service", Value("CreationClassName", "Other") + Value("Name", name));
+    };
     System("a", Service("ssh", "TRUE"));
     System("b", Service("ssh", "FALSE"));
-    System("c", Service("ssh", "TRUE") + other);
-    EXPECT_EQ("Service  +1 ~1   only in c: CreationClassName=Other,Name=x\n"
+    System("c", Service("ssh", "TRUE") + other("ssh") + other("x"));
+    EXPECT_EQ("Service  +2 ~1   only in c: CreationClassName=Other,Name=ssh; CreationClassName=Other,Name=x\n"
               "    CreationClassName=Service,Name=ssh.Started: TRUE -> FALSE (b)\n",
               Findings());
 }
