@@ -25,14 +25,14 @@ namespace {
 
 const char kSeeCoverage[] = " (--coverage)";
 
-// "330 and 332", or of more than two inventories "330 to 332".
-std::string Range(const std::vector<std::size_t>& counts)
+// "330 and 332 instances", or of more than two inventories "330 to 332 instances".
+std::string Instances(const std::vector<std::size_t>& counts)
 {
     if (counts.size() == 2) {
-        return std::to_string(counts[0]) + " and " + std::to_string(counts[1]);
+        return std::to_string(counts[0]) + " and " + std::to_string(counts[1]) + " instances";
     }
     const auto [least, most] = std::minmax_element(counts.begin(), counts.end());
-    return *least == *most ? std::to_string(*least) : std::to_string(*least) + " to " + std::to_string(*most);
+    return (*least == *most ? "" : std::to_string(*least) + " to ") + Counted(*most, "instance");
 }
 
 std::size_t CountLeftOut(const TCoverage& coverage, TCoverage::EReason reason)
@@ -52,7 +52,7 @@ std::string Compared(const TComparisonReport& report)
     for (std::size_t i = 0; i < report.labels.size(); ++i) {
         counts.push_back(report.coverage.CountCompared(i));
     }
-    std::string line = Range(counts) + (counts.size() > 2 ? " instances of each in " : " instances in ") +
+    std::string line = Instances(counts) + (counts.size() > 2 ? " of each in " : " in ") +
                        Counted(report.coverage.CountComparedClasses(), "class", "classes") + " compared";
     const std::size_t byRules = CountLeftOut(report.coverage, TCoverage::EReason::kLeftOutByRules);
     if (byRules > 0) {
@@ -81,8 +81,8 @@ std::string NotCompared(const TComparisonReport& report)
     if (names.empty()) {
         return std::string();
     }
-    return "Not compared: " + Counted(names.size(), "class", "classes") + " with " + Range(counts) +
-           " instances: " + SomeOf(names) + kSeeCoverage + "\n";
+    return "Not compared: " + Counted(names.size(), "class", "classes") + " with " + Instances(counts) + ": " + SomeOf(names) +
+           kSeeCoverage + "\n";
 }
 
 // What an inventory says that it lacks, in few words; empty for nothing.

@@ -1,5 +1,5 @@
 // A PUnit is a base unit, perhaps with powers of a number behind it: "byte", "byte * 2^10", "hertz * 10^6", "bit / second * 10^3".
-// Powers of ten become the prefixes of such units, and bytes are counted.
+// Powers of ten become the prefixes of such units, and bytes are counted. A unit that is not known is shown as it is written.
 #include "client/text/TUnit.h"
 
 #include <algorithm>
@@ -102,6 +102,14 @@ const char* PrefixOf(const std::vector<TPower>& powers)
     return nullptr;
 }
 
+// "KiloBytes" of one is "KiloByte", "Bits per Second" is "Bit per Second"; "Celsius" and "Gauss" stay.
+std::string SingularOf(const std::string& name)
+{
+    const std::size_t end = std::min(name.find(' '), name.size());
+    const bool isPlural = end > 2 && name[end - 1] == 's' && name[end - 2] != 's' && name[end - 2] != 'u';
+    return isPlural ? name.substr(0, end - 1) + name.substr(end) : name;
+}
+
 bool IsUnsigned(TCIMValue::TCIMType type)
 {
     return type == TCIMValue::TCIMType::kUint8 || type == TCIMValue::TCIMType::kUint16 || type == TCIMValue::TCIMType::kUint32 ||
@@ -117,9 +125,11 @@ bool IsNumber(TCIMValue::TCIMType type)
 
 TUnit::TUnit(const std::string& programmatic, const std::string& units)
 {
-    if (!TakeProgrammatic(programmatic)) {
-        TakeUnits(boost::algorithm::trim_copy(units));
+    if (TakeProgrammatic(programmatic)) {
+        return;
     }
+    const std::string name = boost::algorithm::trim_copy(units);
+    TakeUnits(name.empty() ? boost::algorithm::trim_copy(programmatic) : name);
 }
 
 // Whether the unit is known.
@@ -138,6 +148,7 @@ bool TUnit::TakeProgrammatic(const std::string& text)
     const std::string base = boost::algorithm::to_lower_copy(boost::algorithm::trim_copy(parts.front()));
     if (base == "byte") {
         fBytes = Multiply(powers);
+        TakeName(fBytes == 1 ? "bytes" : boost::algorithm::trim_copy(text));
         return fBytes > 0;
     }
     const auto known =
@@ -147,6 +158,7 @@ bool TUnit::TakeProgrammatic(const std::string& text)
         return false;
     }
     fName = std::string(prefix) + known->shown;
+    fNameOfOne = fName;
     return true;
 }
 
@@ -155,39 +167,47 @@ void TUnit::TakeUnits(const std::string& text)
     const std::string lower = boost::algorithm::to_lower_copy(text);
     if (lower == "bytes") {
         fBytes = 1;
-        return;
     }
     const auto known =
         std::find_if(std::begin(kOldUnits), std::end(kOldUnits), [&lower](const auto& unit) { return lower == unit.units; });
     if (known != std::end(kOldUnits)) {
         fName = known->shown;
+        fNameOfOne = fName;
     } else if (!text.empty()) {
-        fName = InlineText(TCIMValue(text));
+        TakeName(lower == "bytes" ? lower : text);
     }
+}
+
+// A name as a declaration has it, for numbers that are shown as they are.
+void TUnit::TakeName(const std::string& name)
+{
+    fName = InlineText(TCIMValue(name));
+    fNameOfOne = InlineText(TCIMValue(SingularOf(name)));
 }
 
 std::string TUnit::Describe(const TCIMValue& number) const
 {
-    if (number.IsNull() || !IsNumber(number.GetType()) || (fBytes == 0 && fName.empty())) {
+    if (number.IsNull() || !IsNumber(number.GetType()) || fName.empty()) {
         return std::string();
     }
-    if (fBytes == 0) {
-        return DisplayValue(number) + " " + fName;
+    const bool isCounted =
+        fBytes > 0 && IsUnsigned(number.GetType()) && number.GetUnsigned() <= std::numeric_limits<std::uint64_t>::max() / fBytes;
+    if (isCounted) {
+        return ReadableBytes(number.GetUnsigned() * fBytes);
     }
-    if (!IsUnsigned(number.GetType())) {
-        return fBytes == 1 ? DisplayValue(number) + " bytes" : std::string();
-    }
-    const bool fits = number.GetUnsigned() <= std::numeric_limits<std::uint64_t>::max() / fBytes;
-    return fits ? ReadableBytes(number.GetUnsigned() * fBytes) : std::string();
+    const std::string text = DisplayValue(number);
+    return text + " " + (text == "1" || text == "-1" ? fNameOfOne : fName);
 }
 
-// In quarters of the unit, a number is exact with two digits.
+// From one MiB on, people want the magnitude first, and below it the number. In quarters of the unit, a number is exact with two
+// digits.
 std::string ReadableBytes(std::uint64_t bytes)
 {
     constexpr std::uint64_t kStep = 1024;
     const char* const names[] = {"KiB", "MiB", "GiB", "TiB", "PiB", "EiB"};
-    if (bytes < kStep) {
-        return std::to_string(bytes) + (bytes == 1 ? " byte" : " bytes");
+    const std::string exact = std::to_string(bytes) + (bytes == 1 ? " byte" : " bytes");
+    if (bytes < kStep * kStep) {
+        return bytes == 0 || bytes % kStep != 0 ? exact : std::to_string(bytes / kStep) + " KiB";
     }
     std::size_t name = 0;
     std::uint64_t unit = kStep;
@@ -201,7 +221,7 @@ std::string ReadableBytes(std::uint64_t bytes)
         decimals.pop_back();
     }
     const std::string text = std::to_string(bytes / unit + hundredths / 100) + decimals + " " + names[name];
-    return rest % (unit / 4) == 0 ? text : text + " (" + std::to_string(bytes) + " bytes)";
+    return rest % (unit / 4) == 0 ? text : text + " (" + exact + ")";
 }
 
 }  // namespace NORVZEL20

@@ -43,17 +43,46 @@ TEST(TUnitTest, NamesUnitsAsTheyAreWritten)
                  {"percent", "", "1500 %"},
                  {"revolution / minute", "", "1500 rpm"},
                  {"furlong", "Furlongs", "1500 Furlongs"},
-                 {"furlong", "", ""},
+                 {"furlong", "", "1500 furlong"},
+                 {"meter * 10^-4", "", "1500 meter * 10^-4"},
+                 {" count / second ", "", "1500 \"count / second\""},
                  {"", "MilliSeconds", "1500 ms"},
                  {"", "Tenths of a: Degree", "1500 \"Tenths of a: Degree\""},
-                 {"byte", "", "1.46 KiB (1500 bytes)"},
-                 {"", "Bytes", "1.46 KiB (1500 bytes)"},
+                 {"byte", "", "1500 bytes"},
+                 {"", "Bytes", "1500 bytes"},
                  {"byte * 2^10", "KiloBytes", "1.46 MiB (1536000 bytes)"},
                  {"byte * 2^20 * 1024", "", "1.46 TiB (1610612736000 bytes)"},
                  {"byte * 10^3", "KiloBytes", "1.43 MiB (1500000 bytes)"},
-                 {"byte * 2^63", "", ""}};
+                 {"byte * 2^63", "", "1500 byte * 2^63"},
+                 {"byte * 2^70", "", "1500 byte * 2^70"}};
     for (const auto& expected : cases) {
         EXPECT_EQ(expected.text, TUnit(expected.programmatic, expected.units).Describe(number)) << expected.programmatic;
+    }
+}
+
+TEST(TUnitTest, OneIsSingular)
+{
+    const struct {
+        const char* programmatic;
+        const char* units;
+        TCIMValue number;
+        const char* text;
+    } cases[] = {{"", "KiloBytes", TCIMValue(1U), "1 KiloByte"},
+                 {"", "KiloBytes", TCIMValue(-1), "-1 KiloByte"},
+                 {"", "KiloBytes", TCIMValue(2U), "2 KiloBytes"},
+                 {"", "Hundredths of Seconds", TCIMValue(1U), "1 Hundredth of Seconds"},
+                 {"", "Degrees Celsius", TCIMValue(1U), "1 Degree Celsius"},
+                 {"", "Celsius", TCIMValue(1U), "1 Celsius"},
+                 {"", "Gauss", TCIMValue(1U), "1 Gauss"},
+                 {"", "Seconds", TCIMValue(1U), "1 s"},
+                 {"byte", "", TCIMValue(1U), "1 byte"},
+                 {"byte", "", TCIMValue(-1), "-1 byte"},
+                 {"byte", "", TCIMValue(-2), "-2 bytes"},
+                 {"", "Bytes", TCIMValue(-1), "-1 byte"},
+                 {"byte * 2^10", "KiloBytes", TCIMValue(-5), "-5 byte * 2^10"},
+                 {"bit / second", "", TCIMValue(1U), "1 bit/s"}};
+    for (const auto& expected : cases) {
+        EXPECT_EQ(expected.text, TUnit(expected.programmatic, expected.units).Describe(expected.number)) << expected.text;
     }
 }
 
@@ -63,8 +92,11 @@ TEST(TUnitTest, BytesAreInTheLargestUnitAndNeverAlike)
     EXPECT_EQ("1 byte", ReadableBytes(1));
     EXPECT_EQ("1023 bytes", ReadableBytes(1023));
     EXPECT_EQ("1 KiB", ReadableBytes(1024));
-    EXPECT_EQ("1.5 KiB", ReadableBytes(1536));
-    EXPECT_EQ("1024 KiB (1048575 bytes)", ReadableBytes(1048575));
+    EXPECT_EQ("1500 bytes", ReadableBytes(1500));
+    EXPECT_EQ("1536 bytes", ReadableBytes(1536));
+    EXPECT_EQ("64 KiB", ReadableBytes(65536));
+    EXPECT_EQ("1048575 bytes", ReadableBytes(1048575));
+    EXPECT_EQ("1.5 MiB", ReadableBytes(1572864));
     EXPECT_EQ("512 MiB", ReadableBytes(536870912));
     EXPECT_EQ("7.46 MiB (7823345 bytes)", ReadableBytes(7823345));
     EXPECT_EQ("16 EiB (18446744073709551615 bytes)", ReadableBytes(UINT64_MAX));
