@@ -2,6 +2,19 @@
 
 namespace NORVZEL20 {
 
+namespace {
+
+// What is wrong with a number of lines; empty if nothing is.
+std::string RefuseAllButCounts(const std::string& text)
+{
+    constexpr std::size_t kMostDigits = 18;  // of a number that surely fits
+    const bool isCount = !text.empty() && text.size() <= kMostDigits && text.find_first_not_of("0123456789") == std::string::npos &&
+                         text.find_first_not_of('0') != std::string::npos;
+    return isCount ? std::string() : text + " is no number of lines; give a whole number from 1 on";
+}
+
+}  // namespace
+
 void AddReportOptions(CLI::App* command, TTextOptions& text)
 {
     CLI::Option* const detail =
@@ -17,7 +30,7 @@ void AddReportOptions(CLI::App* command, TTextOptions& text)
         ->add_option("--limit", text.mostLines,
                      "shorten groups until the findings of a text report take no more lines, if they can (default: 200 on a "
                      "terminal, otherwise none)")
-        ->check(CLI::PositiveNumber)
+        ->check(&RefuseAllButCounts)
         ->option_text("LINES");
 }
 

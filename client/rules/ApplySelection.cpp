@@ -206,7 +206,7 @@ class TSelector {
             }
         }
         const auto& [position, names] = *members.begin();
-        throw TClientError(typed.Show() + ": is not compared in any case; cimdelta explain " + fBefore[position].name + "." +
+        throw TClientError(typed.Show() + ": is not compared without the option either; cimdelta explain " + fBefore[position].name + "." +
                            *names.begin() + " says why");
     }
 

@@ -245,8 +245,11 @@ TEST_F(GroupedReportTest, ALimitIsAPositiveNumber)
 {
     System("a", "");
     System("b", "");
-    EXPECT_NE("", Complaint({"compare", "a.xml", "b.xml", "--limit", "-1"}));
-    EXPECT_NE("", Complaint({"compare", "a.xml", "b.xml", "--limit", "0"}));
+    for (const std::string limit : {"0", "-1", "x", "1.5", "2 ", "9999999999999999999"}) {
+        EXPECT_EQ("cimdelta: --limit: " + limit +
+                      " is no number of lines; give a whole number from 1 on; see cimdelta compare --help\n",
+                  Complaint({"compare", "a.xml", "b.xml", "--limit", limit}));
+    }
 }
 
 TEST_F(GroupedReportTest, InventoriesWithTheSameValueStandTogether)
