@@ -30,6 +30,7 @@
 #include <vector>
 
 #include "client/findings/CollectFindings.h"
+#include "client/findings/CollectOutliers.h"
 #include "client/findings/InventoriesByCount.h"
 #include "client/report/BaselineText.h"
 #include "client/report/DescribeNotShown.h"
@@ -40,6 +41,7 @@
 #include "client/report/TGroupedText.h"
 #include "client/report/TInventoryNames.h"
 #include "client/report/TextCoverage.h"
+#include "client/report/WriteOutliers.h"
 #include "client/text/DisplayText.h"
 
 namespace NORVZEL20 {
@@ -61,8 +63,10 @@ class TMarkdown {
         if (!IsPair()) {
             sink(Inventories());
         }
-        for (const TClassFindings& findings : fFindings.classes) {
-            sink(Class(findings));
+        if (fOptions.showsOutliers) {
+            WriteOutliers(sink);
+        } else {
+            WriteClasses(sink, fFindings.classes, "###", IsPair());
         }
         sink(Baseline());
         sink(Coverage());
@@ -81,11 +85,28 @@ class TMarkdown {
         return table + "\n";
     }
 
-    std::string Class(const TClassFindings& findings) const
+    // Who is odd and in what, as a comparison of two.
+    void WriteOutliers(const TTextSink& sink) const
     {
-        TClassLines shortened(findings, fNames, fOptions, IsPair(), kMostShown);
-        TClassLines whole(findings, fNames, fOptions, IsPair(), kMostExamples);
-        std::string text = "### " + EscapeForMarkdown(EscapeForDisplay(findings.className) + " " + shortened.Counts()) + "\n\n";
+        for (const TOutliers& outliers : CollectOutliers(fReport, fOptions.hasWholeKeys)) {
+            sink("### " + EscapeForMarkdown(DescribeOutliers(outliers, fNames)) + "\n\n");
+            WriteClasses(sink, outliers.classes, "####", true);
+        }
+    }
+
+    void WriteClasses(const TTextSink& sink, const std::vector<TClassFindings>& classes, const std::string& level,
+                      bool isPair) const
+    {
+        for (const TClassFindings& findings : classes) {
+            sink(level + " " + Class(findings, isPair));
+        }
+    }
+
+    std::string Class(const TClassFindings& findings, bool isPair) const
+    {
+        TClassLines shortened(findings, fNames, fOptions, isPair, kMostShown);
+        TClassLines whole(findings, fNames, fOptions, isPair, kMostExamples);
+        std::string text = EscapeForMarkdown(EscapeForDisplay(findings.className) + " " + shortened.Counts()) + "\n\n";
         for (const TPresenceFinding& presence : findings.presences) {
             AddFinding(text, shortened.WriteOne(presence), whole.WriteOne(presence));
         }
@@ -148,7 +169,7 @@ class TMarkdown {
 
 void WriteMarkdownReport(const TComparisonReport& report, const TTextOptions& options, const TTextSink& sink)
 {
-    const TFindings findings = CollectFindings(report);
+    const TFindings findings = CollectFindings(report, kMostExamples, options.hasWholeKeys);
     TMarkdown(report, findings, options).Write(sink);
 }
 

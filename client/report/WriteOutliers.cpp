@@ -28,9 +28,7 @@ using TBlock = std::vector<std::string>;
 
 TBlock WriteBlock(const TOutliers& outliers, const TInventoryNames& names, const TTextOptions& options, std::size_t most)
 {
-    const bool isOne = outliers.inventories.size() == 1;
-    TBlock block{Paint(options.isColored, kBold, names.List(outliers.inventories)) + (isOne ? ": " : " alike: ") +
-                 Counted(outliers.differences, "difference")};
+    TBlock block{DescribeOutliers(outliers, names, options.isColored)};
     for (const std::string& line : TClassTable(outliers.classes, names, options, true).Write(most)) {
         block.push_back(kIndent + line);
     }
@@ -62,6 +60,13 @@ void CollapseBlocks(std::vector<TBlock>& blocks, std::size_t mostLines)
 }
 
 }  // namespace
+
+std::string DescribeOutliers(const TOutliers& outliers, const TInventoryNames& names, bool isColored)
+{
+    const bool isOne = outliers.inventories.size() == 1;
+    return Paint(isColored, kBold, names.List(outliers.inventories)) + (isOne ? ": " : " alike: ") +
+           Counted(outliers.differences, "difference");
+}
 
 std::string WriteOutliers(const std::vector<TOutliers>& outliers, const TInventoryNames& names, const TTextOptions& options)
 {

@@ -90,6 +90,37 @@ TEST_F(MarkdownFormatTest, AGroupThatTheTextWouldShortenIsFolded)
               Report(Packages(9, "1"), Packages(9, "2")));
 }
 
+TEST_F(MarkdownFormatTest, OutliersAreComparisonsOfTwo)
+{
+    const std::string report = Result({"compare", "-o", "markdown", "--outliers", "web01.xml", "web02.xml", "web03.xml"});
+    const std::size_t begin = report.find("### web01");
+    EXPECT_EQ("### web01: 2 differences\n"
+              "\n"
+              "#### INV_Package -1 \\~1\n"
+              "\n"
+              "- `- curl   Version 8.1, Section web, Size 300`\n"
+              "- `~ bash.Version: 5.2 -> 5.1`\n"
+              "\n"
+              "### web02: 6 differences\n",
+              report.substr(begin, report.find("\n\n#### INV_Disk") + 1 - begin));
+}
+
+TEST_F(MarkdownFormatTest, FullKeysAndTextsAreWholeIfAskedFor)
+{
+    const auto with = [](const std::string& text) {
+        return Document(System() + Class("Note", "", KeyProperty("Kind") + KeyProperty("Id") + Declaration("Text", "string")) +
+                        Instance("Note", Value("Kind", "k") + Value("Id", "1") + Value("Text", text)) +
+                        Instance("Note", Value("Kind", "k") + Value("Id", "2") + Value("Text", "t")));
+    };
+    const std::string same(60, 's');
+    EXPECT_NE(
+        std::string::npos,
+        Report(with(same + "one"), with(same + "two texts")).find("`~ 1.Text: ...ssssssssssssone -> ...sssssssssssstwo texts`"));
+    EXPECT_NE(std::string::npos, Report(with(same + "one"), with(same + "two texts"), {"--full"})
+                                     .find("`~ Id=\"1\",Kind=\"k\".Text: " + same + "one -> " + same + "two texts`"))
+        << fOut;
+}
+
 TEST_F(MarkdownFormatTest, ValuesShowAsTheyAre)
 {
     const std::string note = System() + Class("Note", "", KeyProperty("Id") + Declaration("Text", "string"));
