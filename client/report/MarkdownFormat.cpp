@@ -118,12 +118,12 @@ class TMarkdown {
     }
 
     // One finding: a list, folded if the text would shorten it.
-    static void AddFinding(std::string& text, const std::vector<TClassLines::TLine>& shortened,
-                           const std::vector<TClassLines::TLine>& whole)
+    void AddFinding(std::string& text, const std::vector<TClassLines::TLine>& shortened,
+                    const std::vector<TClassLines::TLine>& whole) const
     {
         std::string list;
         for (const TClassLines::TLine& line : whole) {
-            list += "- " + MarkdownCode(line.contents.empty() ? line.text : line.text + "   " + line.contents) + "\n";
+            list += "- " + MarkdownCode(line.contents.empty() ? line.text : line.text + "   " + Contents(line)) + "\n";
         }
         if (whole.size() == shortened.size() && whole.front().text == shortened.front().text) {
             text += list;
@@ -131,6 +131,11 @@ class TMarkdown {
         }
         EndParagraph(text);
         text += "<details><summary>" + HtmlCode(shortened.front().text) + "</summary>\n\n" + list + "\n</details>\n\n";
+    }
+
+    std::string Contents(const TClassLines::TLine& line) const
+    {
+        return TClassLines::JoinContents(line.contents, fOptions, line.text.size());
     }
 
     static void EndParagraph(std::string& text) { text += boost::algorithm::ends_with(text, "\n\n") ? "" : "\n"; }

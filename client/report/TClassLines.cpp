@@ -273,18 +273,30 @@ std::string TClassLines::Shorten(const std::vector<std::string>& names, std::siz
     return shown < count ? text + separator + More(count - shown) : text;
 }
 
-// As much of what the instance holds as fits into the line.
-std::string TClassLines::Contents(const TPresenceFinding::TExample& example) const
+std::vector<std::string> TClassLines::Contents(const TPresenceFinding::TExample& example) const
 {
-    std::string text;
+    std::vector<std::string> contents;
     for (const auto& [property, value] : example.contents) {
         const std::string words = fFindings.WordsFor(property).Describe(value);
-        const std::string next =
-            (text.empty() ? "" : ", ") + EscapeForDisplay(property) + " " + (words.empty() ? ListedText(value) : words);
-        if (fOptions.width > 0 && !fOptions.hasWholeKeys && example.name.size() + text.size() + next.size() > fOptions.width) {
-            return text + (text.empty() ? "..." : ", ...");
+        contents.push_back(EscapeForDisplay(property) + " " + (words.empty() ? ListedText(value) : words));
+    }
+    return contents;
+}
+
+std::string TClassLines::JoinContents(const std::vector<std::string>& contents, const TTextOptions& options, std::size_t used)
+{
+    const bool areWhole = options.width == 0 || options.hasWholeKeys;
+    const std::size_t room = options.width - std::min(options.width, used);
+    const char separator[] = ", ";
+    const char rest[] = "...";
+    std::string text;
+    for (std::size_t i = 0; i < contents.size(); ++i) {
+        const std::string next = text + (i > 0 ? separator : "") + contents[i];
+        const std::size_t behind = i + 1 < contents.size() ? sizeof separator + sizeof rest - 2 : 0;
+        if (!areWhole && next.size() + behind > room) {
+            return text + (i > 0 ? separator : "") + rest;
         }
-        text += next;
+        text = next;
     }
     return text;
 }

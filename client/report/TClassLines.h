@@ -13,11 +13,12 @@ namespace NORVZEL20 {
 /// The lines of one class in a grouped report, without the name of the class.
 class TClassLines {
   public:
-    /// A line, and the kind of difference that colours it. What an instance holds is kept apart, because it stands in a column.
+    /// A line, and the kind of difference that colours it. What an instance holds is kept apart, property by property, because it
+    /// stands in a column and as much is shown as fits.
     struct TLine {
         std::string text;
         TDifference::EKind kind;
-        std::string contents = std::string();
+        std::vector<std::string> contents = {};
     };
 
     /// Of each group, at most `most` members are shown; a group of no more is shown whole. All arguments must outlive this.
@@ -33,6 +34,9 @@ class TClassLines {
     /// The lines of one of the findings.
     std::vector<TLine> WriteOne(const TPresenceFinding& presence);
     std::vector<TLine> WriteOne(const TPropertyFinding& property);
+
+    /// As many of the contents as fit into a line in which so many columns are `used`, and "..." for the others.
+    static std::string JoinContents(const std::vector<std::string>& contents, const TTextOptions& options, std::size_t used);
 
   private:
     void AddPresences(TDifference::EKind kind);
@@ -51,7 +55,7 @@ class TClassLines {
     std::string ExampleOf(const TPropertyFinding& property) const;
     std::string Change(const TChangeFinding& change, bool isPair) const;
     std::string Shorten(const std::vector<std::string>& names, std::size_t count) const;
-    std::string Contents(const TPresenceFinding::TExample& example) const;
+    std::vector<std::string> Contents(const TPresenceFinding::TExample& example) const;
 
     const TClassFindings& fFindings;
     const TInventoryNames& fNames;

@@ -15,6 +15,7 @@
 
 #include <algorithm>
 #include <boost/algorithm/string/join.hpp>
+#include <cstring>
 #include <numeric>
 
 #include "client/findings/CollectFindings.h"
@@ -153,9 +154,13 @@ void TClassTable::AppendPair(TLines& all, const std::string& head, const std::ve
                              std::size_t column) const
 {
     for (std::size_t i = 0; i < lines.size(); ++i) {
-        const std::size_t gap = std::max(column, lines[i].text.size()) - lines[i].text.size();
-        all.push_back((i == 0 ? Bold(head) : std::string(head.size(), ' ')) + Colored(lines[i]) +
-                      (lines[i].contents.empty() ? std::string() : std::string(gap, ' ') + kBeforeContents + lines[i].contents));
+        std::string line = (i == 0 ? Bold(head) : std::string(head.size(), ' ')) + Colored(lines[i]);
+        if (!lines[i].contents.empty()) {
+            const std::size_t begin = std::max(column, lines[i].text.size());
+            line += std::string(begin - lines[i].text.size(), ' ') + kBeforeContents +
+                    TClassLines::JoinContents(lines[i].contents, fOptions, head.size() + begin + std::strlen(kBeforeContents));
+        }
+        all.push_back(line);
     }
 }
 

@@ -12,6 +12,7 @@
 #include <algorithm>
 #include <boost/algorithm/string/join.hpp>
 #include <cstddef>
+#include <cstring>
 #include <numeric>
 
 #include "client/report/TClassTable.h"
@@ -29,7 +30,9 @@ using TBlock = std::vector<std::string>;
 TBlock WriteBlock(const TOutliers& outliers, const TInventoryNames& names, const TTextOptions& options, std::size_t most)
 {
     TBlock block{DescribeOutliers(outliers, names, options.isColored)};
-    for (const std::string& line : TClassTable(outliers.classes, names, options, true).Write(most)) {
+    TTextOptions indented = options;
+    indented.width -= std::min(indented.width, std::strlen(kIndent));
+    for (const std::string& line : TClassTable(outliers.classes, names, indented, true).Write(most)) {
         block.push_back(kIndent + line);
     }
     block.emplace_back();

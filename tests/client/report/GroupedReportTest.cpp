@@ -262,11 +262,22 @@ TEST_F(GroupedReportTest, InventoriesWithTheSameValueStandTogether)
     EXPECT_EQ("Adapter  ~1   eth0.MTU: 1 -> 2 (all but web03) / 3 (web03)\n", Findings());
 }
 
+// The name of the class and the place of the contents count too.
 TEST_F(GroupedReportTest, ContentsAreCutAtTheWidth)
 {
     System("a", "");
-    System("b", Package("long", std::string(100, 'v'), "someone"));
-    EXPECT_EQ("Package  + long   Version " + std::string(100, 'v') + ", ...\n", Findings());
+    System("b", Package("long", std::string(89, 'v'), "someone"));
+    EXPECT_EQ("Package  + long   Version " + std::string(89, 'v') + ", ...\n", Findings());
+    fSystems.pop_back();
+    System("c", Package("long", std::string(90, 'v'), "someone"));
+    EXPECT_EQ("Package  + long   ...\n", Findings());
+    EXPECT_EQ("Package  + Name=\"long\"   Version " + std::string(90, 'v') + ", Vendor someone\n", Findings({"--full"}));
+    fSystems.pop_back();
+    System("d", Package("long", std::string(76, 'v'), "someone!!"));
+    EXPECT_EQ("Package  + long   Version " + std::string(76, 'v') + ", Vendor someone!!\n", Findings());
+    fSystems.pop_back();
+    System("e", Package("long", std::string(77, 'v'), "someone!!"));
+    EXPECT_EQ("Package  + long   Version " + std::string(77, 'v') + ", ...\n", Findings());
 }
 
 TEST_F(GroupedReportTest, OfLongTextsTheChangeIsShown)
