@@ -14,6 +14,7 @@
 #include "client/text/EmbeddedText.h"
 #include "client/text/InlineText.h"
 #include "client/text/ListedText.h"
+#include "client/text/TellMarksApart.h"
 
 namespace NORVZEL20 {
 
@@ -94,6 +95,7 @@ std::string ElementsChanged(const TCIMValue& from, const TCIMValue& to)
     for (const std::string& text : added) {
         parts.push_back("+" + text);
     }
+    TellMarksApart(parts);
     return boost::algorithm::join(parts, " ");
 }
 
@@ -137,6 +139,7 @@ std::vector<std::string> ValuesOf(const TValueDifference& change, const std::vec
     for (const std::size_t i : chosen) {
         values.push_back(Shown(change.others[i].value, change, texts.GetOther(i), style.words));
     }
+    TellMarksApart(values);
     return style.isWhole ? values : CutAround(values);
 }
 

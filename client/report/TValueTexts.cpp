@@ -5,6 +5,7 @@
 
 #include "client/text/DisplayText.h"
 #include "client/text/EmbeddedText.h"
+#include "client/text/TellMarksApart.h"
 
 namespace NORVZEL20 {
 
@@ -54,6 +55,7 @@ TValueTexts::TValueTexts(const TValueDifference& difference, bool hasReference) 
         fTexts[i] =
             (isTyped ? DescribeContents(*values[i]) + " " : std::string()) + (isExact ? DisplayValue(*values[i]) : fTexts[i]);
     }
+    TellMarksApart(fTexts);
 }
 
 }  // namespace NORVZEL20

@@ -302,6 +302,16 @@ TEST_F(GroupedReportTest, OfLongTextsOfSeveralTheChangesAreShown)
     EXPECT_NE(std::string::npos, Findings({"--full"}).find(text + "it stops in the end of the text that is long\" (b)"));
 }
 
+TEST_F(GroupedReportTest, TextsThatLookAlikeShowTheirAccents)
+{
+    System("a", Package("p", "1", "Ren\u00e9"));
+    System("b", Package("p", "1", "Rene\u0301"));
+    EXPECT_EQ("Package  ~ p.Vendor: Ren\u00e9 -> Rene\\u0301\n", Findings());
+    EXPECT_NE(std::string::npos, Compare({"--detail"}).find("    Vendor: Ren\u00e9 -> Rene\\u0301\n"));
+    System("c", Package("p", "1", "Ren\u00e9e"));
+    EXPECT_EQ("Package  ~1   p.Vendor: Ren\u00e9 -> Rene\\u0301 (b) / Ren\u00e9e (c)\n", Findings());
+}
+
 TEST_F(GroupedReportTest, WithoutDifferencesSaysSoInTwoLines)
 {
     System("a", Service("ssh", "TRUE"));
