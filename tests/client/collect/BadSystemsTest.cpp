@@ -2,6 +2,7 @@
 #include <sys/stat.h>
 
 #include "client/collect/read/TextPieces.h"
+#include "client/inventory/NotCollected.h"
 #include "tests/client/collect/TCollectFixture.h"
 
 namespace NORVZEL20 {
@@ -36,6 +37,24 @@ TEST_F(BadSystemsTest, WhatIsLeftOutIsInTheInventory)
               "    Count: 1\n"
               "    Subjects: {\"/etc/shadow\"}\n",
               Show("KALMO_NotCollected"));
+}
+
+/// Servers have no CIM_ManagedElement, so the class has a declaration for them beside that in LinuxClasses.mof.
+TEST_F(BadSystemsTest, WhatIsLeftOutIsDeclaredAsInInventoriesOfServers)
+{
+    const std::string collected = fSystem->CollectTo("collected.xml");
+    const TOutputFolder folder;
+    const std::string written = folder / "written.xml";
+    std::ofstream(written) << WriteNotCollected("root/cimv2", {{"files", "it may hold keys or passwords", {"/etc/shadow"}, 1}},
+                                                true);
+    const std::string report = Run({"compare", "--detail", "--class", "KALMO_NotCollected", collected.c_str(), written.c_str()});
+    EXPECT_EQ(0, fStatus);
+    // Types, keys or properties that differ would be further lines.
+    EXPECT_TRUE(EndsWith(report,
+                         "Made in written: an instance of KALMO_OperatingSystem.\n"
+                         "KALMO_NotCollected is below CIM_ManagedElement in collected and a top-level class in written; rules "
+                         "are inherited as in collected.\n"))
+        << report;
 }
 
 TEST_F(BadSystemsTest, KindsThatWereNotAskedForAreNamed)
