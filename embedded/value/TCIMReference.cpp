@@ -35,6 +35,21 @@ const std::string& GetEmptyText()
     return *fgEmpty;
 }
 
+/// The position of the first binding whose name is `name` or comes behind it. There must be one.
+std::size_t FindPosition(const TKeyBindings& bindings, const std::string& name)
+{
+    std::size_t first = 0;
+    for (std::size_t last = bindings.GetCount() - 1; first < last;) {
+        const std::size_t middle = first + (last - first) / 2;
+        if (TNameText::Compare(bindings.GetName(middle), name) < 0) {
+            first = middle + 1;
+        } else {
+            last = middle;
+        }
+    }
+    return first;
+}
+
 void AppendPlace(std::string& out, const std::string& host, const std::string& namespaceName)
 {
     if (!host.empty()) {
@@ -111,7 +126,7 @@ TCIMReference::TCIMReference(boost::shared_ptr<ICIMNamespace> ns, std::map<std::
     // take more memory than it needs. In either case, the path frees the contents if something below throws.
     TCIMReference path(ns ? new TContents : TContents::Make());
     if (ns) {
-        TContents::TPlace& place = path.fContents->OwnPlace();
+        TPathFrame::TPlace& place = path.fContents->bindings.OwnFrame().OwnPlace();
         place.ns = ns;
         if (const auto* const located = dynamic_cast<const ILocated*>(ns.get())) {
             place.namespaceName = Trim(located->GetNamespaceName(), "/");
@@ -169,19 +184,16 @@ void TCIMReference::AddKeyValue(const std::string& name, const TCIMValue& value)
     TContents& contents = Own();
     auto& bindings = contents.bindings;
     // Keys mostly come in their order.
-    if (bindings.empty() || TNameText::Compare(bindings.back().first, name) < 0) {
+    const std::size_t count = bindings.GetCount();
+    if (count == 0 || TNameText::Compare(bindings.GetName(count - 1), name) < 0) {
         bindings.Append(name, value);
-        contents.depth = std::max(contents.depth, depth);
-        return;
-    }
-    TContents::TBinding* const place =
-        std::lower_bound(bindings.begin(), bindings.end(), name, [](const TContents::TBinding& binding, const std::string& wanted) {
-            return TNameText::Compare(binding.first, wanted) < 0;
-        });
-    if (place != bindings.end() && TNameText::Equal(place->first, name)) {
-        place->second = value;
     } else {
-        bindings.Insert(place, name, value);
+        const std::size_t position = FindPosition(bindings, name);
+        if (TNameText::Equal(bindings.GetName(position), name)) {
+            bindings.SetValue(position, value);
+        } else {
+            bindings.Insert(position, name, value);
+        }
     }
     contents.depth = std::max(contents.depth, depth);
 }
@@ -192,8 +204,9 @@ void TCIMReference::EnumerateKeyBindings(const boost::function<bool(std::pair<st
     if (held.fContents == nullptr) {
         return;
     }
-    for (const TContents::TBinding& binding : held.fContents->bindings) {
-        if (!callback(binding)) {
+    const TKeyBindings& bindings = held.fContents->bindings;
+    for (std::size_t at = 0; at < bindings.GetCount(); ++at) {
+        if (!callback({bindings.GetName(at), bindings.GetValue(at)})) {
             return;
         }
     }
@@ -201,12 +214,13 @@ void TCIMReference::EnumerateKeyBindings(const boost::function<bool(std::pair<st
 
 boost::shared_ptr<ICIMClass> TCIMReference::GetClass() const
 {
-    return fContents != nullptr ? fContents->cls : nullptr;
+    const boost::shared_ptr<ICIMClass>* const cls = TContents::FindClass(fContents);
+    return cls != nullptr ? *cls : nullptr;
 }
 
 void TCIMReference::SetClass(boost::shared_ptr<ICIMClass> cls)
 {
-    Own().cls = std::move(cls);
+    Own().bindings.OwnFrame().cls = std::move(cls);
 }
 
 /// Appends the text of any path.
@@ -229,11 +243,12 @@ void TCIMReference::WriteParts(TOut& out, const std::string& className) const
 {
     out.Put(className);
     char separator = '.';
-    for (const TContents::TBinding& binding : fContents->bindings) {
+    const TKeyBindings& bindings = fContents->bindings;
+    for (std::size_t at = 0; at < bindings.GetCount(); ++at) {
         out.Put(separator);
-        out.Put(binding.first);
+        out.Put(bindings.GetName(at));
         out.Put('=');
-        out.PutKey(binding.second);
+        out.PutKey(bindings.GetValue(at));
         separator = ',';
     }
 }
@@ -247,8 +262,9 @@ std::string TCIMReference::GetPath() const
     const std::string& className = GetClassName();
     TCountingOut count;
     WriteParts(count, className);
-    if (count.IsPlain() && !fContents->place) {
-        path = std::string(count.GetLength(), '\0');  // cheaper than growing the empty text to that length
+    if (count.IsPlain() && TContents::FindPlace(fContents) == nullptr) {
+        path = std::string(count.GetLength(),
+                           '\0');  // cheaper than growing the empty text to that length
         TPlainOut out(path.data());
         WriteParts(out, className);
         return path;
@@ -275,7 +291,7 @@ void TCIMReference::AppendText(std::string& out, TCIMValue::EKeyForm form) const
     if (fContents == nullptr) {
         return;
     }
-    if (fContents->place) {
+    if (TContents::FindPlace(fContents) != nullptr) {
         const std::size_t start = out.size();
         AppendPlace(out, GetHost(), GetNamespaceName());
         if (form == TCIMValue::EKeyForm::kCanonical) {
@@ -288,41 +304,46 @@ void TCIMReference::AppendText(std::string& out, TCIMValue::EKeyForm form) const
 
 boost::shared_ptr<ICIMNamespace> TCIMReference::GetNamespace() const
 {
-    return fContents != nullptr && fContents->place ? fContents->place->ns.lock() : nullptr;
+    const TPathFrame::TPlace* const place = TContents::FindPlace(fContents);
+    return place != nullptr ? place->ns.lock() : nullptr;
 }
 
 const std::string& TCIMReference::GetNamespaceName() const
 {
-    return fContents != nullptr && fContents->place ? fContents->place->namespaceName : GetEmptyText();
+    const TPathFrame::TPlace* const place = TContents::FindPlace(fContents);
+    return place != nullptr ? place->namespaceName : GetEmptyText();
 }
 
 void TCIMReference::SetNamespaceName(const std::string& name)
 {
     std::string trimmed(Trim(name, "/"));
-    TContents::TPlace& place = Own().OwnPlace();
+    TPathFrame& frame = Own().bindings.OwnFrame();
+    TPathFrame::TPlace& place = frame.OwnPlace();
     // The namespace held so far has the old name, so it is not the one that is meant now.
     if (!TNameText::Equal(place.namespaceName, trimmed)) {
         place.ns.reset();
     }
     place.namespaceName = std::move(trimmed);
-    fContents->DropEmptyPlace();
+    frame.DropEmptyPlace();
 }
 
 const std::string& TCIMReference::GetHost() const
 {
-    return fContents != nullptr && fContents->place ? fContents->place->host : GetEmptyText();
+    const TPathFrame::TPlace* const place = TContents::FindPlace(fContents);
+    return place != nullptr ? place->host : GetEmptyText();
 }
 
 void TCIMReference::SetHost(const std::string& host)
 {
-    TContents& contents = Own();
-    contents.OwnPlace().host = host;
-    contents.DropEmptyPlace();
+    TPathFrame& frame = Own().bindings.OwnFrame();
+    frame.OwnPlace().host = host;
+    frame.DropEmptyPlace();
 }
 
 const std::string& TCIMReference::GetClassName() const
 {
-    return fContents != nullptr && fContents->cls ? fContents->cls->GetName(TCallContext()) : GetEmptyText();
+    const boost::shared_ptr<ICIMClass>* const cls = TContents::FindClass(fContents);
+    return cls != nullptr ? (*cls)->GetName(TCallContext()) : GetEmptyText();
 }
 
 void TCIMReference::SetClassName(const std::string& name)
@@ -332,7 +353,7 @@ void TCIMReference::SetClassName(const std::string& name)
 
 std::size_t TCIMReference::GetKeyCount() const
 {
-    return fContents != nullptr ? fContents->bindings.size() : 0;
+    return fContents != nullptr ? fContents->bindings.GetCount() : 0;
 }
 
 const TCIMValue* TCIMReference::FindKeyValue(const std::string& name) const
@@ -340,12 +361,14 @@ const TCIMValue* TCIMReference::FindKeyValue(const std::string& name) const
     if (fContents == nullptr) {
         return nullptr;
     }
-    const auto& bindings = fContents->bindings;
     // Paths have few keys, so they are searched from the front.
-    const TContents::TBinding* const found =
-        std::find_if(bindings.begin(), bindings.end(),
-                     [&name](const TContents::TBinding& binding) { return TNameText::Equal(binding.first, name); });
-    return found != bindings.end() ? &found->second : nullptr;
+    const TKeyBindings& bindings = fContents->bindings;
+    for (std::size_t at = 0; at < bindings.GetCount(); ++at) {
+        if (TNameText::Equal(bindings.GetName(at), name)) {
+            return &bindings.GetValue(at);
+        }
+    }
+    return nullptr;
 }
 
 }  // namespace NORVZEL20

@@ -294,7 +294,7 @@ TCIMReference TCIMReference::Parse(const std::string& text, boost::shared_ptr<IC
         }
         TValueAccess::LimitDepth(binding.value, 0);  // text in quotes may hold paths that nest too deeply
         contents.depth = std::max(contents.depth, TContents::GetDepth(binding.value));
-        contents.bindings.Append(std::move(binding.name), std::move(binding.value));
+        contents.bindings.Append(std::move(binding.name), binding.value);
     }
     return path;
 }

@@ -1,5 +1,9 @@
 #include "embedded/value/TKeyBindings.h"
 
+#include <algorithm>
+#include <new>
+#include <utility>
+
 #include "embedded/value/TValueAccess.h"
 
 namespace NORVZEL20 {
@@ -10,45 +14,123 @@ constexpr std::size_t kLongestKeptName = 64;  // longer ones are rare, and their
 
 }  // namespace
 
-void TKeyBindings::Append(const std::string& name, const TCIMValue& value)
+TKeyBindings::TKeyBindings(const TKeyBindings& other) : TKeyBindings()
 {
-    if (fCount == fBindings.size()) {
-        fBindings.emplace_back(name, value);
+    Reserve(other.fCount);
+    fFrame = other.fFrame;
+    std::copy(other.GetValues(), other.GetValues() + other.fCount, GetValues());
+    fCount = other.fCount;
+}
+
+TKeyBindings::~TKeyBindings()
+{
+    FreeValues();
+}
+
+void TKeyBindings::FreeValues() noexcept
+{
+    if (fCapacity > 1) {
+        delete[] fMany;
     } else {
-        TBinding& spare = fBindings[fCount];
-        if (spare.first != name) {
-            spare.first = name;
-        }
-        TCIMValue copy(value);
-        TValueAccess::MoveToNull(spare.second, copy);
+        fOne.~TCIMValue();
     }
-    ++fCount;
 }
 
-void TKeyBindings::Append(std::string&& name, TCIMValue&& value)
+TPathFrame& TKeyBindings::OwnFrame()
 {
-    DropSpares();
-    fBindings.emplace_back(std::move(name), std::move(value));
-    ++fCount;
+    if (!fFrame) {
+        fFrame.reset(new TPathFrame, false);
+    } else if (!fFrame->IsUnique()) {
+        fFrame.reset(new TPathFrame(*fFrame, fCount), false);
+    }
+    return *fFrame;
 }
 
-void TKeyBindings::Insert(const TBinding* place, const std::string& name, const TCIMValue& value)
+void TKeyBindings::Reserve(std::size_t count)
 {
-    const auto position = place - begin();
-    DropSpares();
-    fBindings.emplace(fBindings.begin() + position, name, value);
+    if (count <= fCapacity) {
+        return;
+    }
+    TCIMValue* const values = new TCIMValue[count];
+    for (std::size_t position = 0; position < fCount; ++position) {
+        TValueAccess::MoveToNull(values[position], GetValues()[position]);
+    }
+    FreeValues();
+    fMany = values;
+    fCapacity = static_cast<std::uint32_t>(count);
+}
+
+void TKeyBindings::Append(std::string&& name, const TCIMValue& value)
+{
+    MakeRoom();
+    InsertName(fCount, std::move(name));
+    InsertValue(fCount, value);
+}
+
+void TKeyBindings::Insert(std::size_t position, const std::string& name, const TCIMValue& value)
+{
+    MakeRoom();
+    // The frame often has the name already, from the bindings before.
+    const bool isThere = position == fCount && fFrame && fFrame->names.size() > fCount && fFrame->names[fCount] == name;
+    if (!isThere) {
+        InsertName(position, std::string(name));
+    }
+    InsertValue(position, value);
+}
+
+void TKeyBindings::MakeRoom()
+{
+    if (fCount == fCapacity) {
+        Reserve(std::size_t{2} * fCount);
+    }
+}
+
+/// Afterwards the frame has the names in front of `position`, then `name`, then those of the other bindings.
+void TKeyBindings::InsertName(std::size_t position, std::string&& name)
+{
+    std::vector<std::string>& names = OwnFrame().names;
+    names.reserve(std::max<std::size_t>(fCount + std::size_t{1}, fCapacity));
+    if (position == fCount && fCount < names.size()) {
+        names[position] = std::move(name);
+        return;
+    }
+    names.resize(fCount);
+    names.insert(names.begin() + static_cast<std::ptrdiff_t>(position), std::move(name));
+}
+
+void TKeyBindings::InsertValue(std::size_t position, const TCIMValue& value) noexcept
+{
+    TCIMValue* const values = GetValues();
+    values[fCount] = value;
+    std::rotate(values + position, values + fCount, values + fCount + 1);
     ++fCount;
 }
 
 void TKeyBindings::Clear() noexcept
 {
-    for (TBinding& binding : *this) {
-        const TCIMValue ended(std::move(binding.second));
-        if (binding.first.capacity() > kLongestKeptName) {
-            binding.first = std::string();
-        }
+    for (std::uint32_t position = 0; position < fCount; ++position) {
+        const TCIMValue ended(std::move(GetValues()[position]));
     }
     fCount = 0;
+    if (!fFrame) {
+        return;
+    }
+    const auto isLong = [](const std::string& name) { return name.capacity() > kLongestKeptName; };
+    if (!fFrame->IsUnique() || std::any_of(fFrame->names.begin(), fFrame->names.end(), isLong)) {
+        fFrame.reset();
+        return;
+    }
+    fFrame->place.reset();
+    fFrame->cls.reset();
+}
+
+bool TKeyBindings::HasSameFrame(const TKeyBindings& other) const noexcept
+{
+    if (fCount != other.fCount || fFrame == other.fFrame || !fFrame || !other.fFrame) {
+        return fCount == other.fCount && fFrame == other.fFrame;
+    }
+    return fFrame->cls == other.fFrame->cls && fFrame->HasSamePlace(*other.fFrame) &&
+           std::equal(fFrame->names.begin(), fFrame->names.begin() + fCount, other.fFrame->names.begin());
 }
 
 }  // namespace NORVZEL20

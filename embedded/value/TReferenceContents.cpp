@@ -70,8 +70,6 @@ void TCIMReference::TContents::Drop(TContents* contents) noexcept
         return;
     }
     // What the path held may be the last use of other paths, which end here and become spares themselves.
-    contents->place.reset();
-    contents->cls.reset();
     contents->bindings.Clear();
     contents->depth = 0;
     TSpares& spares = TSpares::OfThread();
@@ -82,6 +80,16 @@ void TCIMReference::TContents::Drop(TContents* contents) noexcept
     thread_local const TSparesEnd fgEnd{spares};
     static_cast<void>(fgEnd);
     spares.contents[spares.count++] = contents;
+}
+
+bool TCIMReference::TContents::IsIndistinguishable(const TContents& other) const noexcept
+{
+    // Values first: paths to instances of one class differ in nothing else.
+    bool isSame = bindings.GetCount() == other.bindings.GetCount();
+    for (std::size_t position = 0; isSame && position < bindings.GetCount(); ++position) {
+        isSame = TValueAccess::IsIndistinguishable(bindings.GetValue(position), other.bindings.GetValue(position));
+    }
+    return isSame && bindings.HasSameFrame(other.bindings);
 }
 
 unsigned int TCIMReference::TContents::GetDepth(const TCIMValue& value)

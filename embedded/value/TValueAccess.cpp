@@ -3,6 +3,7 @@
 
 #include "embedded/value/TValueAccess.h"
 
+#include <algorithm>
 #include <new>
 
 #include "embedded/value/TCountedBlocks.h"
@@ -60,6 +61,53 @@ std::string_view TValueAccess::GetText(const TCIMValue& value) noexcept
         return run->GetText(Load<std::uint16_t>(value, kRunOffset), Load<std::uint16_t>(value, kRunLength));
     }
     return static_cast<const TSharedText*>(GetBlock(value))->GetText();
+}
+
+bool TValueAccess::IsIndistinguishable(const TCIMValue& a, const TCIMValue& b) noexcept
+{
+    if (HasSameBytes(a, b)) {
+        return true;
+    }
+    if (a.fType != b.fType) {
+        return false;
+    }
+    if (IsText(a) && IsText(b)) {
+        return GetText(a) == GetText(b);
+    }
+    if (a.fForm != b.fForm) {
+        return false;
+    }
+    if (a.fForm == kArray || a.fForm == kBag) {
+        const auto& left = static_cast<const TCountedArray*>(GetBlock(a))->elements;
+        const auto& right = static_cast<const TCountedArray*>(GetBlock(b))->elements;
+        return std::equal(left.begin(), left.end(), right.begin(), right.end(), &IsIndistinguishable);
+    }
+    if (a.fForm == kPath) {
+        const TCIMReference::TContents* const left = GetPath(a).fContents;
+        const TCIMReference::TContents* const right = GetPath(b).fContents;
+        return left != nullptr && right != nullptr && left->IsIndistinguishable(*right);
+    }
+    return false;
+}
+
+bool TValueAccess::HasSameFrame(const TCIMValue& a, const TCIMValue& b) noexcept
+{
+    if (a.fForm != kPath || b.fForm != kPath) {
+        return false;
+    }
+    const TCIMReference::TContents* const left = GetPath(a).fContents;
+    const TCIMReference::TContents* const right = GetPath(b).fContents;
+    return left != nullptr && right != nullptr && left->bindings.HasSameFrame(right->bindings);
+}
+
+void TValueAccess::ShareFrame(TCIMValue& value, const TCIMValue& other) noexcept
+{
+    // The value is not const, and so the path in it is not either.
+    TCIMReference& path = const_cast<TCIMReference&>(GetPath(value));
+    try {
+        path.Own().bindings.ShareFrame(GetPath(other).fContents->bindings);
+    } catch (const std::bad_alloc&) {
+    }
 }
 
 TCIMValue TValueAccess::FromBits(TCIMValue::TCIMType type, std::uint64_t bits) noexcept
