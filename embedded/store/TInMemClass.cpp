@@ -68,6 +68,13 @@ TInMemExtent& TInMemClass::GetExtent() const
     return *fExtent;
 }
 
+void TInMemClass::ShareRecent(std::uint32_t slot, TCIMValue& value) const noexcept
+{
+    if (fExtent) {
+        fExtent->ShareRecent(slot, value);
+    }
+}
+
 void TInMemClass::Enter(TInMemClass& parent, TInMemExtent& extent)
 {
     // The superclass may have changed between the allocation of this class and its declaration.

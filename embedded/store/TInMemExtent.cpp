@@ -18,12 +18,15 @@
 #include <new>
 
 #include "embedded/store/TStoreRefusal.h"
+#include "embedded/value/TValueAccess.h"
 
 namespace NORVZEL20 {
 
 namespace {
 
 constexpr std::size_t kMinCompactedSize = 32;  // gaps in a list up to this length are not worth a pass
+
+constexpr std::size_t kRecentInstances = 8;  // enough for the properties in which one instance after the other differs
 
 /// The hash of the keys before `key`, which is `seed`, and of `key`.
 std::uint32_t Mix(std::uint32_t seed, const TCIMValue& key)
@@ -227,6 +230,26 @@ void TInMemExtent::Clear() noexcept
         if (instance) {
             instance->SetRemoved();
         }
+    }
+}
+
+void TInMemExtent::ShareRecent(std::uint32_t slot, TCIMValue& value) const noexcept
+{
+    if (!TValueAccess::HasBlock(value)) {
+        return;
+    }
+    const TCIMValue* like = nullptr;
+    const std::size_t end = fInstances.size();
+    for (std::size_t back = 1; back <= std::min(end, kRecentInstances); ++back) {
+        const TCIMValue* const recent = fInstances[end - back] ? fInstances[end - back]->FindOwnValue(slot) : nullptr;
+        if (recent && TValueAccess::IsIndistinguishable(*recent, value)) {
+            value = *recent;
+            return;
+        }
+        like = !like && recent && TValueAccess::HasSameFrame(*recent, value) ? recent : like;
+    }
+    if (like) {
+        TValueAccess::ShareFrame(value, *like);
     }
 }
 

@@ -199,7 +199,9 @@ void TInMemInstance::SetSlot(std::uint32_t slot, TCIMValue value)
         decl->GetStaticProperty().SetValue(value);
         return;
     }
-    Change(slot, Fit(slot, std::move(value)));
+    TCIMValue fitting = Fit(slot, std::move(value));
+    fClass->ShareRecent(slot, fitting);
+    Change(slot, std::move(fitting));
 }
 
 bool TInMemInstance::FillSlot(std::uint32_t slot, TCIMValue& value) noexcept

@@ -49,6 +49,11 @@ class CIMDELTA_EXPORT TInMemInstance final : public ICIMInstance, public boost::
     TInMemProperty& GetSlotProperty(std::uint32_t slot) const;
     /// The value in a slot, also that of a static property.
     const TCIMValue& GetSlotValue(std::uint32_t slot) const;
+    /// The same if the property stands behind the instance; otherwise null.
+    const TCIMValue* FindOwnValue(std::uint32_t slot) const noexcept
+    {
+        return slot < fSlots ? &GetOwnProperties()[slot].GetValue() : nullptr;
+    }
     /// Sets the property in a slot as ICIMProperty::SetValue does, without looking up a name. Errors: kTypeMismatch (13).
     void SetSlot(std::uint32_t slot, TCIMValue value);
     /// The same without checks, for an instance that is being made: not yet added, and still null in that slot. `value` must have
