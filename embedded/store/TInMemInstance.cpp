@@ -46,11 +46,13 @@ struct TInMemInstance::TExtras {
         return found != notes.end() && found->slot == slot && found->about == about ? &*found : nullptr;
     }
 
-    /// Makes room for so many notes, which Add then takes without fail. Errors: std::bad_alloc.
+    /// Makes room for so many notes, which Add then takes without fail. A comparison makes some for nearly every instance that it
+    /// finds changed, so a few take no more memory than they need. Errors: std::bad_alloc.
     void MakeRoom(std::size_t more)
     {
+        constexpr std::size_t kFew = 8;
         if (notes.capacity() - notes.size() < more) {
-            notes.reserve(2 * notes.size() + more);
+            notes.reserve(notes.size() + std::max(more, notes.size() < kFew ? 0 : notes.size()));
         }
     }
 
@@ -61,8 +63,8 @@ struct TInMemInstance::TExtras {
         notes.insert(place, {slot, about, std::move(value)});
     }
 
-    std::vector<TInMemLateBlock::TPointer> lateBlocks;  ///< in order of slots
-    std::vector<TNote> notes;                           ///< likewise; mostly made in this order
+    std::unique_ptr<std::vector<TInMemLateBlock::TPointer>> lateBlocks;  ///< in order of slots; null if there are none
+    std::vector<TNote> notes;                                            ///< likewise; mostly made in this order
 };
 
 TInMemProperty* TInMemInstance::GetOwnProperties() const noexcept
@@ -234,7 +236,10 @@ TInMemInstance::TExtras& TInMemInstance::GetExtras() const
 
 TInMemProperty& TInMemInstance::GetLateProperty(std::uint32_t slot) const
 {
-    std::vector<TInMemLateBlock::TPointer>& lateBlocks = GetExtras().lateBlocks;
+    if (!GetExtras().lateBlocks) {
+        fExtras->lateBlocks = std::make_unique<std::vector<TInMemLateBlock::TPointer>>();
+    }
+    std::vector<TInMemLateBlock::TPointer>& lateBlocks = *fExtras->lateBlocks;
     std::uint32_t end = fSlots;
     for (const TInMemLateBlock::TPointer& late : lateBlocks) {
         end = late->GetEnd();
@@ -272,8 +277,8 @@ void TInMemInstance::MarkChanged(std::uint32_t slot, TCIMValue&& fitting)
         Change(slot, std::move(fitting));
         return;
     }
-    // Room first: the change itself may need room for a note too, and once it is made, nothing may fail.
-    GetExtras().MakeRoom(2);
+    // Room first: the change of a key may need room for a note too, and once it is made, nothing may fail.
+    GetExtras().MakeRoom(fClass->GetLayout().GetDecl(slot).IsKey() ? 2 : 1);
     TCIMValue earlier = GetSlotProperty(slot).fValue;
     Change(slot, std::move(fitting));
     fExtras->Add(TExtras::EAbout::kEarlier, slot, std::move(earlier));

@@ -28,7 +28,7 @@ class InMemMemoryTest : public TInMemFixture {
         return cls;
     }
 
-    static void AddPackage(const TClassPointer& cls, int number)
+    static TInstancePointer AddPackage(const TClassPointer& cls, int number)
     {
         const auto instance = cls->AllocateInMemInstance();
         const std::string text = "package number " + std::to_string(number);  // 16 to 20 characters
@@ -41,6 +41,7 @@ class InMemMemoryTest : public TInMemFixture {
         instance->SetSlot(11, TCIMValue(false));
         instance->SetSlot(12, TCIMValue("amd64"));
         instance->AddToNamespace(TCallContext());
+        return instance;
     }
 };
 
@@ -57,6 +58,27 @@ TEST_F(InMemMemoryTest, AnInstanceOfThirteenPropertiesTakesAtMostNineHundredByte
     std::printf("%zu bytes per instance\n", each);
     EXPECT_GT(each, 500U);
     EXPECT_LE(each, 900U);
+}
+
+/// A comparison changes a few values of nearly every instance, and what they were before is kept.
+TEST_F(InMemMemoryTest, ThreeChangedValuesOfAnInstanceTakeAtMostAHundredAndFiftyBytes)
+{
+    constexpr int kCount = 1000;
+    const auto cls = DeclarePackage();
+    std::vector<TInstancePointer> instances;
+    for (int number = 0; number < kCount; ++number) {
+        instances.push_back(AddPackage(cls, number));
+    }
+    const std::size_t before = HeapInUse();
+    for (const TInstancePointer& instance : instances) {
+        instance->GetSlotProperty(8).MarkChanged(Uint64(1));
+        instance->GetSlotProperty(9).MarkChanged(Uint64(2));
+        instance->GetSlotProperty(11).MarkChanged(TCIMValue(true));
+    }
+    const std::size_t each = (HeapInUse() - before) / kCount;
+    EXPECT_GE(each, 3 * sizeof(TCIMValue));
+    EXPECT_LE(each, 150U);
+    EXPECT_EQ("27", instances[9]->GetSlotProperty(9).GetEarlierValue()->ToText());
 }
 
 TEST_F(InMemMemoryTest, ReadingAPropertyAllocatesNothing)
