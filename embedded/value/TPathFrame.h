@@ -64,8 +64,7 @@ struct TPathFrame : TCounted {
         }
     }
 
-    std::unique_ptr<TPlace> place;  // null: no namespace and no host, as for most
-                                    // paths in an inventory
+    std::unique_ptr<TPlace> place;  // null: no namespace and no host, as for most paths in an inventory
     boost::shared_ptr<ICIMClass> cls;
     std::vector<std::string> names;  // of the keys, and behind them of keys that the path had before
 };
