@@ -1,12 +1,10 @@
 #pragma once
 
 #include <chrono>
-#include <condition_variable>
-#include <mutex>
 #include <string>
-#include <thread>
 
 #include "client/process/IConsole.h"
+#include "client/process/TTicker.h"
 
 namespace NORVZEL20 {
 
@@ -19,20 +17,14 @@ class TLastResort {
   public:
     /// `console` must outlive this.
     TLastResort(IConsole& console, std::chrono::milliseconds patience, std::string message, void (*cleanUp)() noexcept);
-    TLastResort(const TLastResort&) = delete;
-    TLastResort& operator=(const TLastResort&) = delete;
-    ~TLastResort();
 
   private:
-    void Wait(std::chrono::milliseconds patience) noexcept;
+    [[noreturn]] void End() noexcept;
 
     IConsole& fConsole;
     const std::string fMessage;
     void (*const fCleanUp)() noexcept;
-    std::mutex fMutex;
-    std::condition_variable fWake;
-    bool fDone = false;
-    std::thread fThread;
+    TTicker fTicker;  // the last one, because it calls End
 };
 
 }  // namespace NORVZEL20

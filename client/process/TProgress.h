@@ -1,13 +1,11 @@
 #pragma once
 
 #include <chrono>
-#include <condition_variable>
 #include <functional>
-#include <mutex>
 #include <string>
-#include <thread>
 
 #include "client/process/IConsole.h"
+#include "client/process/TTicker.h"
 
 namespace NORVZEL20 {
 
@@ -28,17 +26,14 @@ class TProgress {
     ~TProgress();
 
   private:
-    void Wait() noexcept;
-    std::string Describe(unsigned int elapsed) const;
+    void Show() noexcept;
+    std::string Describe() const;
 
     IConsole& fConsole;
     const std::string fDoing;
     const TAmount fAmount;
-    const std::chrono::milliseconds fPatience;
-    std::mutex fMutex;
-    std::condition_variable fWake;
-    bool fDone = false;
-    std::thread fThread;
+    unsigned int fElapsed = 0;
+    TTicker fTicker;  // the last one, because it calls Show
 };
 
 }  // namespace NORVZEL20
