@@ -3,7 +3,6 @@
 // Whether the contents are read depends on the permissions and the name, not on who collects, so the inventories of root and of
 // another user meet: a file that not everybody may read has a digest only if --root-files asked for it, and one for keys or
 // passwords never has one. Who owns them, and with which permissions, is in the inventory all the same.
-#include <fnmatch.h>
 
 #include <algorithm>
 #include <array>
@@ -12,6 +11,7 @@
 #include "client/collect/CollectKinds.h"
 #include "client/collect/DigestFile.h"
 #include "client/collect/HoldsSecrets.h"
+#include "client/collect/MatchesAny.h"
 #include "client/collect/TFileWalk.h"
 #include "client/collect/read/ReadAccounts.h"
 
@@ -87,11 +87,7 @@ class TConfigurationFiles {
           fGroups(NamesByNumber("/etc/group", &ReadGroups, "GroupID"))
     {}
 
-    bool IsWanted(const std::string& path) const
-    {
-        const auto matches = [&path](const char* pattern) { return fnmatch(pattern, path.c_str(), 0) == 0; };
-        return !fCollection.IsExcluded(path) && std::none_of(std::begin(kNoConfiguration), std::end(kNoConfiguration), matches);
-    }
+    bool IsWanted(const std::string& path) const { return !fCollection.IsExcluded(path) && !MatchesAny(path, kNoConfiguration); }
 
     bool Visit(const std::string& path, const struct stat& status)
     {

@@ -9,6 +9,7 @@
 #include <algorithm>
 
 #include "client/collect/CollectKinds.h"
+#include "client/collect/MatchesAny.h"
 #include "client/collect/read/ReadModules.h"
 #include "client/collect/read/TextPieces.h"
 
@@ -53,8 +54,7 @@ constexpr const char* kNoSettings[] = {
 
 bool IsSetting(const std::string& name)
 {
-    return std::none_of(std::begin(kNoSettings), std::end(kNoSettings),
-                        [&name](const char* pattern) { return fnmatch(pattern, name.c_str(), 0) == 0; });
+    return !MatchesAny(name, kNoSettings);
 }
 
 // Whether it is a folder such as net/ipv4/conf/veth12, of an interface that is no adapter, bond or VLAN.

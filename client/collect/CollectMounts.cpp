@@ -2,7 +2,6 @@
 //
 // Mounts that programs make and remove by themselves, for a session or a container, are left out: they say nothing about how the
 // system is set up, and each time they have other names. A file system is asked for its size only if it is on this system.
-#include <fnmatch.h>
 #include <sys/statvfs.h>
 
 #include <algorithm>
@@ -10,6 +9,7 @@
 
 #include "client/collect/CollectKinds.h"
 #include "client/collect/IsRemote.h"
+#include "client/collect/MatchesAny.h"
 #include "client/collect/read/ReadMountInfo.h"
 
 namespace NORVZEL20 {
@@ -31,8 +31,7 @@ constexpr const char* kSizelessTypes[] = {
 
 bool IsPassing(const TMount& mount)
 {
-    return std::any_of(std::begin(kPassingMounts), std::end(kPassingMounts),
-                       [&mount](const char* pattern) { return fnmatch(pattern, mount.path.c_str(), 0) == 0; });
+    return MatchesAny(mount.path, kPassingMounts);
 }
 
 bool HasSize(const TMount& mount)

@@ -8,13 +8,12 @@
 //
 // Units that programs make for a session or a command are left out: those with a file for the time of their run, and those without
 // a file that have such a name. A unit with a file of its own stays, whatever its name.
-#include <fnmatch.h>
 
-#include <algorithm>
 #include <map>
 #include <set>
 
 #include "client/collect/CollectKinds.h"
+#include "client/collect/MatchesAny.h"
 #include "client/collect/TUnitFiles.h"
 #include "client/collect/read/TextPieces.h"
 
@@ -40,8 +39,7 @@ using TUnitStates = std::map<std::string, TUnitState>;
 
 bool IsPassingUnit(const std::string& name)
 {
-    return std::any_of(std::begin(kPassingUnits), std::end(kPassingUnits),
-                       [&name](const char* pattern) { return fnmatch(pattern, name.c_str(), 0) == 0; });
+    return MatchesAny(name, kPassingUnits);
 }
 
 bool HasProcesses(const TCollection& collection, const std::string& group)

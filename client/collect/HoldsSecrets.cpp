@@ -1,15 +1,12 @@
 #include "client/collect/HoldsSecrets.h"
 
-#include <fnmatch.h>
-
-#include <algorithm>
-#include <iterator>
+#include "client/collect/MatchesAny.h"
 
 namespace NORVZEL20 {
 
 namespace {
 
-// Shell patterns of whole paths; an asterisk also stands for slashes.
+// Patterns of whole paths, as MatchesAny takes them.
 constexpr const char* kSecretFiles[] = {
     "*/shadow",
     "*/shadow-",
@@ -56,17 +53,11 @@ constexpr const char* kSecretFiles[] = {
 // Files about passwords that hold none.
 constexpr const char* kOpenFiles[] = {"/etc/pam.d/*"};
 
-bool Matches(const char* const* begin, const char* const* end, const std::string& path)
-{
-    return std::any_of(begin, end, [&path](const char* pattern) { return fnmatch(pattern, path.c_str(), 0) == 0; });
-}
-
 }  // namespace
 
 bool HoldsSecrets(const std::string& path)
 {
-    return Matches(std::begin(kSecretFiles), std::end(kSecretFiles), path) &&
-           !Matches(std::begin(kOpenFiles), std::end(kOpenFiles), path);
+    return MatchesAny(path, kSecretFiles) && !MatchesAny(path, kOpenFiles);
 }
 
 }  // namespace NORVZEL20

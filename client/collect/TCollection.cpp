@@ -1,10 +1,8 @@
 #include "client/collect/TCollection.h"
 
-#include <fnmatch.h>
-
-#include <algorithm>
 #include <utility>
 
+#include "client/collect/MatchesAny.h"
 #include "client/collect/TUnitFiles.h"
 #include "client/collect/read/TTextLines.h"
 #include "client/collect/read/TextPieces.h"
@@ -18,8 +16,7 @@ TCollection::TCollection(const TSystemRoot& root, ISystemCalls& calls, const TCo
 
 bool TCollection::IsExcluded(const std::string& path) const
 {
-    return std::any_of(fOptions.excluded.begin(), fOptions.excluded.end(),
-                       [&path](const std::string& pattern) { return fnmatch(pattern.c_str(), path.c_str(), 0) == 0; });
+    return MatchesAny(path, fOptions.excluded);
 }
 
 bool TCollection::IsLeftToRoot(const struct stat& status) const
