@@ -10,13 +10,12 @@
 #include "embedded/cimxml/TCimXmlObjectReader.h"
 
 #include <utility>
-#include <vector>
 
 #include "embedded/cimxml/TCimXmlReader.h"
 #include "embedded/cimxml/TXmlReader.h"
 #include "embedded/load/MessageText.h"
+#include "embedded/load/ReadEachText.h"
 #include "embedded/value/TEmbeddedObject.h"
-#include "embedded/value/TValueAccess.h"
 
 namespace NORVZEL20 {
 
@@ -75,17 +74,9 @@ TCIMValue TCimXmlObjectReader::Read(std::string_view text)
 
 TCIMValue TCimXmlObjectReader::ReadAll(const TCIMValue& value)
 {
-    if (value.IsNull()) {
-        return value;
-    }
-    if (value.GetType().IsArray()) {
-        std::vector<TCIMValue> elements;
-        for (const TCIMValue& element : value.GetElements()) {
-            elements.push_back(ReadAll(element));
-        }
-        return TCIMValue(value.GetType(), static_cast<unsigned int>(elements.size()), elements);
-    }
-    return TValueAccess::IsText(value) && TEmbeddedObject::IsPerhapsText(value.GetString()) ? Read(value.GetString()) : value;
+    return ReadEachText(value, [this](const TCIMValue& text) {
+        return TEmbeddedObject::IsPerhapsText(text.GetString()) ? Read(text.GetString()) : text;
+    });
 }
 
 }  // namespace NORVZEL20

@@ -10,12 +10,12 @@
 
 #include "embedded/load/AsText.h"
 #include "embedded/load/MessageText.h"
+#include "embedded/load/ReadEachText.h"
 #include "embedded/mof/TMofClassParser.h"
 #include "embedded/mof/TMofTokens.h"
 #include "embedded/mof/TMofValueParser.h"
 #include "embedded/store/TInMemClass.h"
 #include "embedded/value/TNameText.h"
-#include "embedded/value/TValueAccess.h"
 
 namespace NORVZEL20 {
 
@@ -130,21 +130,13 @@ TCIMValue TMofInstanceMaker::ReadObjects(const TCIMValue& value, std::optional<T
 
 TCIMValue TMofInstanceMaker::ReadElements(const TCIMValue& value)
 {
-    if (value.IsNull()) {
-        return value;
-    }
-    if (value.GetType().IsArray()) {
-        std::vector<TCIMValue> elements;
-        for (const TCIMValue& element : value.GetElements()) {
-            elements.push_back(ReadElements(element));
+    return ReadEachText(value, [this](const TCIMValue& text) {
+        if (!IsPerhapsMof(text.GetString())) {
+            return text;
         }
-        return TCIMValue(value.GetType(), static_cast<unsigned int>(elements.size()), elements);
-    }
-    if (!TValueAccess::IsText(value) || !IsPerhapsMof(value.GetString())) {
-        return value;
-    }
-    const TLoadContext::TEmbedded embedded(fContext);
-    return TCIMValue(ReadObjectText(value.GetString()));
+        const TLoadContext::TEmbedded embedded(fContext);
+        return TCIMValue(ReadObjectText(text.GetString()));
+    });
 }
 
 /// The semicolon behind an object may be missing.
