@@ -6,8 +6,8 @@
 #include "client/baseline/FindBadEscape.h"
 #include "client/baseline/ForEachUnquoted.h"
 #include "client/process/TClientError.h"
+#include "client/text/CutText.h"
 #include "client/text/DisplayText.h"
-#include "embedded/value/TUtf8.h"
 
 namespace NORVZEL20 {
 
@@ -111,8 +111,7 @@ void TEntryScanner::RefuseAt(std::size_t offset, const std::string& expected) co
 void TEntryScanner::RefuseFound(std::size_t position, const std::string& field, const std::string& expected) const
 {
     const bool isEnd = field.empty() || field.front() == '#';
-    const std::string shown(TUtf8::Shorten(field, kMostShown));
-    const std::string found = isEnd ? "the end of the entry" : EscapeForDisplay(shown) + (shown.size() < field.size() ? "..." : "");
+    const std::string found = isEnd ? "the end of the entry" : EscapeForDisplay(CutText(field, kMostShown));
     RefusePlace(position, "found " + found + ", expected " + expected);
 }
 

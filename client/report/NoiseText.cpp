@@ -24,9 +24,9 @@
 #include "client/report/TextColors.h"
 #include "client/report/TextCoverage.h"
 #include "client/text/Counted.h"
+#include "client/text/CutText.h"
 #include "client/text/DisplayText.h"
 #include "client/text/QuoteForShell.h"
-#include "embedded/value/TUtf8.h"
 
 namespace NORVZEL20 {
 
@@ -101,8 +101,7 @@ std::string Example(const TNoise& noise, const TNoiseRule& rule)
     TChangeStyle style;
     style.isPair = noise.before.labels.size() == 2;
     style.words = &words;
-    const std::string text = ChangeText(rule.example, NamesOf(noise.before), style);
-    return std::string(TUtf8::Shorten(text, kLongestExample)) + (text.size() > kLongestExample ? "..." : "");
+    return CutText(ChangeText(rule.example, NamesOf(noise.before), style), kLongestExample);
 }
 
 }  // namespace

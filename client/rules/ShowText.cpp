@@ -1,6 +1,6 @@
 #include "client/rules/ShowText.h"
 
-#include "embedded/value/TUtf8.h"
+#include "client/text/CutText.h"
 
 namespace NORVZEL20 {
 
@@ -8,21 +8,16 @@ namespace {
 
 const std::size_t kLongest = 80;
 
-std::string Shorten(const std::string& text)
-{
-    return std::string(TUtf8::Shorten(text, kLongest)) + (text.size() > kLongest ? "..." : "");
-}
-
 }  // namespace
 
 std::string QuoteText(const std::string& text)
 {
-    return '"' + Shorten(text) + '"';
+    return '"' + CutText(text, kLongest) + '"';
 }
 
 std::string ShowName(const std::string& name)
 {
-    return name.empty() || name.find_first_of(" \t\r\n\"") != std::string::npos ? QuoteText(name) : Shorten(name);
+    return name.empty() || name.find_first_of(" \t\r\n\"") != std::string::npos ? QuoteText(name) : CutText(name, kLongest);
 }
 
 }  // namespace NORVZEL20

@@ -2,7 +2,7 @@
 
 #include <algorithm>
 
-#include "embedded/value/TUtf8.h"
+#include "client/text/CutText.h"
 
 namespace NORVZEL20 {
 
@@ -67,7 +67,7 @@ bool EndsWith(std::string_view text, std::string_view end)
 std::string Quoted(std::string_view text)
 {
     constexpr std::size_t kMost = 40;
-    return "\"" + std::string(TUtf8::Shorten(text, kMost)) + (text.size() > kMost ? "..." : "") + "\"";
+    return "\"" + CutText(text, kMost) + "\"";
 }
 
 }  // namespace NORVZEL20

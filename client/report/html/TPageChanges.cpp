@@ -2,7 +2,7 @@
 
 #include "client/report/ChangeText.h"
 #include "client/report/TValueTexts.h"
-#include "embedded/value/TUtf8.h"
+#include "client/text/CutText.h"
 
 namespace NORVZEL20 {
 
@@ -14,8 +14,7 @@ constexpr std::size_t kLongestInLine = 240;
 
 std::string CutForLine(const std::string& text)
 {
-    const std::string_view start = TUtf8::Shorten(text, kLongestInLine);
-    return start.size() == text.size() ? text : std::string(start) + "...";
+    return CutText(text, kLongestInLine);
 }
 
 std::uint32_t TPageChanges::Add(const TValueDifference& change, bool hasReference, const TValueWords& words)
