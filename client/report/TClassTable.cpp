@@ -30,18 +30,6 @@ namespace {
 constexpr std::size_t kLongestInColumn = 32;
 const char kBeforeContents[] = "   ";
 
-const char* ColorOf(TDifference::EKind kind)
-{
-    switch (kind) {
-    case TDifference::kOnlyInReference:
-        return kRed;
-    case TDifference::kOnlyInOthers:
-        return kGreen;
-    default:
-        return kYellow;
-    }
-}
-
 std::vector<std::string> Join(const std::vector<std::vector<std::string>>& classes)
 {
     std::vector<std::string> all;

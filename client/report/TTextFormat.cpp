@@ -16,6 +16,7 @@
 
 #include <boost/algorithm/string/join.hpp>
 
+#include "client/baseline/EntryText.h"
 #include "client/report/BaselineText.h"
 #include "client/report/DescribeAgreement.h"
 #include "client/report/DescribeNotShown.h"
@@ -89,14 +90,8 @@ std::string TTextFormat::Describe(const TDifference& difference, bool sameInstan
     if (sameInstance) {
         return text.Values();
     }
-    switch (difference.kind) {
-    case TDifference::kOnlyInReference:
-        return Paint(fOptions.isColored, kRed, "- " + text.Instance()) + "\n" + text.Values();
-    case TDifference::kOnlyInOthers:
-        return Paint(fOptions.isColored, kGreen, "+ " + text.Instance()) + "\n" + text.Values();
-    default:
-        return Paint(fOptions.isColored, kYellow, "~ " + text.Instance()) + "\n" + text.Values();
-    }
+    const std::string line = std::string(SignOf(difference.kind)) + " " + text.Instance();
+    return Paint(fOptions.isColored, ColorOf(difference.kind), line) + "\n" + text.Values();
 }
 
 std::string TTextFormat::Labels(const std::vector<std::size_t>& inventories) const
