@@ -1,6 +1,6 @@
 #include "client/findings/ChangeIdentity.h"
 
-#include <set>
+#include <algorithm>
 
 #include "client/text/DisplayText.h"
 #include "embedded/value/TValueText.h"
@@ -30,11 +30,13 @@ std::string WholeText(const TValueDifference& change)
 
 std::vector<std::size_t> InventoriesOf(const TValueDifference& change)
 {
-    std::set<std::size_t> inventories;
+    std::vector<std::size_t> inventories;
     for (const TValueDifference::TGroup& group : change.others) {
-        inventories.insert(group.inventories.begin(), group.inventories.end());
+        inventories.insert(inventories.end(), group.inventories.begin(), group.inventories.end());
     }
-    return {inventories.begin(), inventories.end()};
+    std::sort(inventories.begin(), inventories.end());
+    inventories.erase(std::unique(inventories.begin(), inventories.end()), inventories.end());
+    return inventories;
 }
 
 }  // namespace NORVZEL20

@@ -81,9 +81,11 @@ void TClassCollector::AddChange(const TDifference& difference, const TValueDiffe
     TProperty& property = fProperties[{change.property, InventoriesOf(change)}];
     ++property.instances;
     AddWords(change.property);
-    const std::string text = WholeText(change);
+    std::string text = WholeText(change);
     const std::hash<std::string> hash;
-    const TDigest digest(hash(text), hash("2" + text));
+    const std::size_t first = hash(text);
+    text += '2';  // of another text, the second hash is another one
+    const TDigest digest(first, hash(text));
     TKnown& known = property.known[digest];
     ++known.instances;
     if (known.place == kNowhere) {
