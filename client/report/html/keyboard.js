@@ -1,70 +1,79 @@
 // Keys in the list of findings. Only one line can be reached with the tabulator; arrows go from line to line.
 
-function listenToKeys(root, findings) {
-    const { list } = findings;
+class Keyboard {
+    constructor(findings) {
+        this.findings = findings;
+        this.list = findings.list;
+    }
 
-    function isLine(i) {
-        return list.items[i].type === "finding" || list.items[i].type === "row";
+    press(event) {
+        const line = event.target.closest(".line");
+        if (!line || event.altKey || event.ctrlKey || event.metaKey) {
+            return;
+        }
+        const { key } = line.closest(".item").dataset;
+        const i = this.list.places.get(key);
+        const actions = {
+            ArrowDown: () => this.goTo(this.next(i, 1)),
+            ArrowUp: () => this.goTo(this.next(i, -1)),
+            ArrowRight: () => this.open(key),
+            ArrowLeft: () => this.close(key),
+            Home: () => this.goTo(this.next(-1, 1)),
+            End: () => this.goTo(this.next(this.list.items.length, -1)),
+        };
+        if (actions[event.key]) {
+            event.preventDefault();
+            actions[event.key]();
+        }
     }
 
     // The next line from `i` on, `i` excluded; -1 if there is none.
-    function next(i, step) {
-        for (let at = i + step; at >= 0 && at < list.items.length; at += step) {
-            if (isLine(at)) {
+    next(i, step) {
+        const { items } = this.list;
+        for (let at = i + step; at >= 0 && at < items.length; at += step) {
+            if (items[at].type === "finding" || items[at].type === "row") {
                 return at;
             }
         }
         return -1;
     }
 
-    function goTo(i) {
+    goTo(i) {
         if (i >= 0) {
-            list.focus(list.items[i].key, coveredAtTop());
+            this.list.focus(this.list.items[i].key, coveredAtTop());
         }
     }
 
-    async function open(key) {
-        if (!findings.isOpen(key)) {
-            await findings.toggle(key);
-        } else {
-            const child = next(list.places.get(key), 1);
-            if (child >= 0 && list.items[child].level > list.items[list.places.get(key)].level) {
-                goTo(child);
-            }
-        }
-    }
-
-    async function close(key) {
-        if (findings.isOpen(key)) {
-            await findings.toggle(key);
+    // Opens a closed line; from an open one, goes to the first line in it.
+    async open(key) {
+        if (!this.findings.isOpen(key)) {
+            await this.findings.toggle(key);
             return;
         }
-        const i = list.places.get(key);
-        if (list.items[i].type === "row") {
-            goTo(list.places.get(`f${list.items[i].choice.finding.first}`));
+        const { items, places } = this.list;
+        const child = this.next(places.get(key), 1);
+        if (child >= 0 && items[child].level > items[places.get(key)].level) {
+            this.goTo(child);
         }
     }
 
-    root.addEventListener("keydown", (event) => {
-        const line = event.target.closest(".line");
-        if (!line || event.altKey || event.ctrlKey || event.metaKey) {
+    // Closes an open line; from a closed one in a finding, goes to the finding.
+    async close(key) {
+        if (this.findings.isOpen(key)) {
+            await this.findings.toggle(key);
             return;
         }
-        const { key } = line.closest(".item").dataset;
-        const i = list.places.get(key);
-        const actions = {
-            ArrowDown: () => goTo(next(i, 1)),
-            ArrowUp: () => goTo(next(i, -1)),
-            ArrowRight: () => open(key),
-            ArrowLeft: () => close(key),
-            Home: () => goTo(next(-1, 1)),
-            End: () => goTo(next(list.items.length, -1)),
-        };
-        if (actions[event.key]) {
-            event.preventDefault();
-            actions[event.key]();
+        const { items, places } = this.list;
+        const { type, choice } = items[places.get(key)];
+        if (type === "row") {
+            this.goTo(places.get(`f${choice.finding.first}`));
         }
-    });
+    }
+}
+
+function listenToKeys(root, findings) {
+    const keyboard = new Keyboard(findings);
+    root.addEventListener("keydown", (event) => keyboard.press(event));
 }
 
 // How much of the window the filters cover while they stay at its top.
