@@ -57,17 +57,7 @@ class Rows {
 
     // The text that a place of the long text is in; `least` is one at or before it.
     textAt(place, least) {
-        let low = least;
-        let high = this.textLength.length;
-        while (high - low > 1) {
-            const middle = (low + high) >> 1;
-            if (this.textStart[middle] <= place) {
-                low = middle;
-            } else {
-                high = middle;
-            }
-        }
-        return low;
+        return lastStart(this.textStart, place, least, this.textLength.length);
     }
 
     // The end of what begins at `starts[i]`.
@@ -113,4 +103,17 @@ class Rows {
         }
         return list;
     }
+}
+
+// Of ascending starts, the position of the last one that is not behind `place`, from `low` on and before `high`.
+function lastStart(starts, place, low, high) {
+    while (high - low > 1) {
+        const middle = (low + high) >> 1;
+        if (starts[middle] <= place) {
+            low = middle;
+        } else {
+            high = middle;
+        }
+    }
+    return low;
 }

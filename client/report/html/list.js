@@ -1,4 +1,4 @@
-// A list of lines of which only those in the window are in the document. Lines have keys; an element stays as long as its line is in
+// A list of lines; only those in the window are in the document. Lines have keys; an element stays as long as its line is in
 // view. Heights are measured when a line is drawn; until then a line is as high as the last one of its type that was measured.
 //
 // Browsers limit the height of an element. A longer list is drawn in one of the greatest height, and scrolls faster.
@@ -87,17 +87,7 @@ class WindowedList {
     }
 
     indexAt(place) {
-        let low = 0;
-        let high = this.items.length;
-        while (high - low > 1) {
-            const middle = (low + high) >> 1;
-            if (this.starts[middle] <= place) {
-                low = middle;
-            } else {
-                high = middle;
-            }
-        }
-        return low;
+        return lastStart(this.starts, place, 0, this.items.length);
     }
 
     render() {
