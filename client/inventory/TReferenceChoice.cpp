@@ -31,7 +31,7 @@ void CheckMajority(const std::vector<std::string>& labels)
             "two inventories have no majority; name three or more, or leave out --reference majority and --outliers");
     }
     if (std::find(labels.begin(), labels.end(), kMajorityLabel) != labels.end()) {
-        throw TClientError("an inventory is called majority, so reports could not tell it from the majority of the inventories; "
+        throw TClientError("an inventory is called majority, the name that reports give to what most inventories hold; "
                            "give it another label: LABEL=SOURCE");
     }
 }

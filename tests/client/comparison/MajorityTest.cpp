@@ -1,6 +1,5 @@
 #include <gtest/gtest.h>
 
-#include <algorithm>
 #include <map>
 #include <nlohmann/json.hpp>
 #include <random>
@@ -346,8 +345,8 @@ TEST_F(ReferenceTest, WhatCannotBeAReferenceIsRefused)
         Complaint(Arguments({"--reference", "majority", "-o", "cimxml"})));
     System("majority", "");
     EXPECT_EQ(
-        "cimdelta: an inventory is called majority, so reports could not tell it from the majority of the inventories; give it "
-        "another label: LABEL=SOURCE\n",
+        "cimdelta: an inventory is called majority, the name that reports give to what most inventories hold; give it another "
+        "label: LABEL=SOURCE\n",
         Complaint(Arguments({"--reference", "majority"})));
 }
 
