@@ -2,6 +2,9 @@
 #include <curl/curl.h>
 #include <gtest/gtest.h>
 
+#include <string>
+#include <vector>
+
 #include "client/wbem/DescribeCurlFault.h"
 
 namespace NORVZEL20 {
@@ -52,9 +55,20 @@ TCurlFault Begun(CURLcode code)
     return fault;
 }
 
-TEST(CurlFaultTest, EachFaultSaysWhatToDo)
+void ExpectFaults(const std::vector<TCurlFaultRow>& rows)
 {
-    const std::vector<TCurlFaultRow> rows = {
+    for (const TCurlFaultRow& row : rows) {
+        TCurlTransport::TSettings settings;
+        settings.address = ReadWbemAddress(row.address);
+        const TWbemFault fault = DescribeCurlFault(row.fault, settings);
+        EXPECT_EQ(settings.address.server + ": " + row.message, fault.what()) << row.what;
+        EXPECT_EQ(row.kind, fault.GetKind()) << row.what;
+    }
+}
+
+TEST(CurlFaultTest, AFaultOfAConnectionSaysWhatToDo)
+{
+    ExpectFaults({
         {"name", "https://array1", Fault(CURLE_COULDNT_RESOLVE_HOST), TWbemFault::kFinal,
          "no address is known for array1; correct the name, or name the address itself"},
         {"proxy", "https://array1", Fault(CURLE_COULDNT_RESOLVE_PROXY), TWbemFault::kFinal,
@@ -63,6 +77,19 @@ TEST(CurlFaultTest, EachFaultSaysWhatToDo)
          "no connection: Connection refused; is the server running, and is that its port?"},
         {"no reason", "https://array1", Connection(0), TWbemFault::kUnreachable,
          "no connection: curl's words; is the server running, and is that its port?"},
+        {"no TLS", "https://array1", Fault(CURLE_SSL_CONNECT_ERROR, "wrong version number"), TWbemFault::kFinal,
+         "no TLS connection: wrong version number; if the server does not speak TLS at that port, ask it as http:// or at another "
+         "port"},
+        {"no connection in time", "https://array1", Fault(CURLE_OPERATION_TIMEDOUT), TWbemFault::kFinal,
+         "no connection within 20 s; is the server running, and is that its port?"},
+        {"silent", "https://array1", Connected(CURLE_OPERATION_TIMEDOUT), TWbemFault::kSilent,
+         "the server was silent for 120 s; allow it more with --timeout SECONDS"},
+    });
+}
+
+TEST(CurlFaultTest, AFaultOfACertificateSaysWhatToDo)
+{
+    ExpectFaults({
         {"other host", "https://array1", Certificate(0, "DNS:array2"), TWbemFault::kFinal,
          "found the certificate of another host (DNS:array2), expected one for array1; ask for the server by a name that is in its"
          " certificate"},
@@ -74,13 +101,12 @@ TEST(CurlFaultTest, EachFaultSaysWhatToDo)
          "found a certificate of an authority that is not known here; give the authority's certificate, or the server's own if it "
          "is"
          " self-signed, with --ca FILE"},
-        {"no TLS", "https://array1", Fault(CURLE_SSL_CONNECT_ERROR, "wrong version number"), TWbemFault::kFinal,
-         "no TLS connection: wrong version number; if the server does not speak TLS at that port, ask it as http:// or at another "
-         "port"},
-        {"no connection in time", "https://array1", Fault(CURLE_OPERATION_TIMEDOUT), TWbemFault::kFinal,
-         "no connection within 20 s; is the server running, and is that its port?"},
-        {"silent", "https://array1", Connected(CURLE_OPERATION_TIMEDOUT), TWbemFault::kSilent,
-         "the server was silent for 120 s; allow it more with --timeout SECONDS"},
+    });
+}
+
+TEST(CurlFaultTest, AFaultOfAnAnswerSaysWhatToDo)
+{
+    ExpectFaults({
         {"no answer", "https://array1", Fault(CURLE_GOT_NOTHING), TWbemFault::kBroken,
          "the connection was closed without an answer"},
         {"no answer without TLS", "http://array1", Fault(CURLE_GOT_NOTHING), TWbemFault::kBroken,
@@ -90,14 +116,7 @@ TEST(CurlFaultTest, EachFaultSaysWhatToDo)
         {"no HTTP", "http://array1", Fault(CURLE_UNSUPPORTED_PROTOCOL), TWbemFault::kFinal,
          "found an answer that is not HTTP; is this the port of a WBEM server?"},
         {"anything else", "http://array1", Fault(CURLE_FILESIZE_EXCEEDED), TWbemFault::kAnswer, "curl's words"},
-    };
-    for (const TCurlFaultRow& row : rows) {
-        TCurlTransport::TSettings settings;
-        settings.address = ReadWbemAddress(row.address);
-        const TWbemFault fault = DescribeCurlFault(row.fault, settings);
-        EXPECT_EQ(settings.address.server + ": " + row.message, fault.what()) << row.what;
-        EXPECT_EQ(row.kind, fault.GetKind()) << row.what;
-    }
+    });
 }
 
 TEST(CurlFaultTest, AFileOfAuthoritiesIsNamed)

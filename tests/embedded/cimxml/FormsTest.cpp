@@ -40,9 +40,16 @@ struct TFormRow {
     const char* outcome;
 };
 
+void ExpectOutcomes(const std::vector<TFormRow>& rows)
+{
+    for (const TFormRow& row : rows) {
+        EXPECT_EQ(row.outcome, Outcome(row.files)) << row.files;
+    }
+}
+
 TEST(FormsTest, EachFormOfDeclarationsAndInstancesLoads)
 {
-    const TFormRow rows[] = {
+    ExpectOutcomes({
         {"declarations.xml", "1 classes, 0 instances"},
         {"enumerate-classes.xml", "2 classes, 0 instances"},
         {"declarations.xml get-class-own.xml", "2 classes, 0 instances"},
@@ -74,15 +81,12 @@ TEST(FormsTest, EachFormOfDeclarationsAndInstancesLoads)
         {"declarations.xml instance-names.xml enumerate-instances.xml", "1 classes, 2 instances"},
         {"qualifiers.xml", "0 classes, 0 instances"},
         {"several-answers.xml instances.xml named-instances.xml", "1 classes, 2 instances"},
-    };
-    for (const TFormRow& row : rows) {
-        EXPECT_EQ(row.outcome, Outcome(row.files)) << row.files;
-    }
+    });
 }
 
 TEST(FormsTest, WhatIsNoInventoryIsRefusedForWhatItIs)
 {
-    const TFormRow rows[] = {
+    ExpectOutcomes({
         {"nothing.xml", "nothing.xml:1:1: found no class and no instance, so this is no inventory; expected declarations with "
                         "instances, or the answers of a server"},
         {"enumerate-instances-empty.xml", "enumerate-instances-empty.xml:3:12: found an answer to \"EnumerateInstances\" without "
@@ -102,6 +106,12 @@ TEST(FormsTest, WhatIsNoInventoryIsRefusedForWhatItIs)
          "value.xml:1:1: found a value without its class and key; load the instance that it belongs to, as GetInstance returns it"},
         {"method.xml",
          "method.xml:3:12: found the answer to the call of a method, which holds no inventory; load answers with instances"},
+    });
+}
+
+TEST(FormsTest, ErrorsAndRequestsAreRefusedForWhatTheyAre)
+{
+    ExpectOutcomes({
         {"error.xml", "error.xml:4:1: found an error as the answer to \"GetInstance\": CIM_ERR_NOT_FOUND (6), \"no such disk\"; "
                       "expected an answer with objects; correct the name in the request"},
         {"error-unknown.xml", "error-unknown.xml:4:1: found an error as the answer to \"Stop\": status \"4711\", \"\"; expected an "
@@ -113,6 +123,12 @@ TEST(FormsTest, WhatIsNoInventoryIsRefusedForWhatItIs)
          "server's answer instead"},
         {"requests.xml",
          "requests.xml:3:22: found a request to a server (\"Stop\"), which is no inventory; load the server's answer instead"},
+    });
+}
+
+TEST(FormsTest, ASequenceOfAnswersMustEnd)
+{
+    ExpectOutcomes({
         {"declarations.xml open.xml",
          "open.xml:3:12: found an answer to \"OpenEnumerateInstances\" that does not end its sequence (EndOfSequence is not TRUE), "
          "but not the ones after it; pull until the end, and load all the answers together"},
@@ -125,15 +141,12 @@ TEST(FormsTest, WhatIsNoInventoryIsRefusedForWhatItIs)
         {"declarations.xml open-whole.xml open.xml",
          "open.xml:3:12: found an answer to \"OpenEnumerateInstances\" that does not end its sequence (EndOfSequence is not TRUE), "
          "but not the ones after it; pull until the end, and load all the answers together"},
-    };
-    for (const TFormRow& row : rows) {
-        EXPECT_EQ(row.outcome, Outcome(row.files)) << row.files;
-    }
+    });
 }
 
 TEST(FormsTest, OtherFilesAreRefusedWithTheirPlace)
 {
-    const TFormRow rows[] = {
+    ExpectOutcomes({
         {"truncated.xml", "truncated.xml:19:1: found malformed XML: unclosed token; the document ends within <IRETURNVALUE>, so it "
                           "was cut off: fetch or write it again"},
         {"page.html", "page.html:2:1: found element <html> as the outermost element, expected <CIM>, or a part of it such as "
@@ -144,10 +157,7 @@ TEST(FormsTest, OtherFilesAreRefusedWithTheirPlace)
          "other-class.xml:4:1: found class \"Disk\" behind the name of \"Device\", expected the same class in both"},
         {"declarations.xml other-name.xml", "other-name.xml:7:1: found \"sda\" in the key \"Id\" of an instance of class \"Disk\", "
                                             "but the name in front of it says \"sdb\"; correct one of the two"},
-    };
-    for (const TFormRow& row : rows) {
-        EXPECT_EQ(row.outcome, Outcome(row.files)) << row.files;
-    }
+    });
 }
 
 }  // namespace

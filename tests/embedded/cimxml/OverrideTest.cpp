@@ -1,5 +1,8 @@
 #include <gtest/gtest.h>
 
+#include <string>
+#include <vector>
+
 #include "embedded/load/TStoredObjects.h"
 #include "embedded/store/TInMemClass.h"
 #include "tests/embedded/cimxml/TLoading.h"
@@ -25,6 +28,19 @@ class OverrideTest : public testing::Test {
         const std::string sub = "<VALUE.OBJECT><CLASS NAME=\"Sub\" SUPERCLASS=\"Base\">" + elements + "</CLASS></VALUE.OBJECT>";
         fLoading.Load(TLoading::Group(sub + Base()));
         return Describe(*fLoading.GetNamespace()->FindClass("Sub"));
+    }
+
+    struct TMarkedRow {
+        std::string elements;
+        const char* own;  ///< what the class then declares itself
+    };
+
+    void ExpectOwn(const std::vector<TMarkedRow>& rows)
+    {
+        for (const TMarkedRow& row : rows) {
+            fLoading = TLoading();
+            EXPECT_EQ(row.own, OwnOf(row.elements)) << row.elements;
+        }
     }
 
     static std::string Base()
@@ -91,15 +107,9 @@ TEST_F(OverrideTest, AKeyThatOnlyTheSubclassDeclaresIsItsKey)
     EXPECT_FALSE(fLoading.GetNamespace()->FindClass("Base")->FindPropertyDecl("Name")->IsKey());
 }
 
-/// What is said of a marked property, and what the class then declares itself.
-TEST_F(OverrideTest, AMarkedElementIsAnOverrideOnlyIfItSaysSomethingElse)
+TEST_F(OverrideTest, AMarkedPropertyIsAnOverrideIfItSaysSomethingElse)
 {
-    const std::string array = "<PROPERTY.ARRAY NAME=\"Tags\" TYPE=\"string\" PROPAGATED=\"true\"";
-    const std::string reference = "<PROPERTY.REFERENCE NAME=\"Of\" PROPAGATED=\"true\"";
-    const struct {
-        std::string elements;
-        const char* own;
-    } kCases[] = {
+    ExpectOwn({
         {Name(""), ""},
         {Name("<VALUE>none</VALUE>"), ""},
         {Name("<VALUE>other</VALUE>"), "Name [0] = other\n"},
@@ -116,6 +126,15 @@ TEST_F(OverrideTest, AMarkedElementIsAnOverrideOnlyIfItSaysSomethingElse)
         {Name(Qualifier("MaxLen", "9") + "<VALUE>none</VALUE>"), "Name [0] = none MaxLen(9)\n"},
         {Name(Qualifier("Override", "Name")), "Name [0] = NULL Override(Name)\n"},
         {Name(Qualifier("MaxLen", "9") + Qualifier("Description", "the name", kPropagated)), "Name [0] = NULL MaxLen(9)\n"},
+        {"<PROPERTY NAME=\"New\" TYPE=\"string\" PROPAGATED=\"true\"></PROPERTY>", "New [0] = NULL\n"},
+    });
+}
+
+TEST_F(OverrideTest, AMarkedArrayOrReferenceIsAnOverrideIfItSaysSomethingElse)
+{
+    const std::string array = "<PROPERTY.ARRAY NAME=\"Tags\" TYPE=\"string\" PROPAGATED=\"true\"";
+    const std::string reference = "<PROPERTY.REFERENCE NAME=\"Of\" PROPAGATED=\"true\"";
+    ExpectOwn({
         {array + "></PROPERTY.ARRAY>", ""},
         {array + " ARRAYSIZE=\"4\"></PROPERTY.ARRAY>", ""},
         {array + " ARRAYSIZE=\"5\"></PROPERTY.ARRAY>", "Tags [5] = NULL\n"},
@@ -124,6 +143,12 @@ TEST_F(OverrideTest, AMarkedElementIsAnOverrideOnlyIfItSaysSomethingElse)
         {reference + " REFERENCECLASS=\"ANY\"></PROPERTY.REFERENCE>", ""},
         {reference + " REFERENCECLASS=\"Disk\"></PROPERTY.REFERENCE>", "Of Disk[0] = NULL\n"},
         {reference + ">" + Qualifier("Key", "TRUE") + "</PROPERTY.REFERENCE>", "Of Any[0] = NULL Key(TRUE)\n"},
+    });
+}
+
+TEST_F(OverrideTest, AMarkedMethodIsAnOverrideIfItSaysSomethingElse)
+{
+    ExpectOwn({
         {Stop(""), ""},
         {Stop(Qualifier("Description", "stops") + How("uint16", Qualifier("In", "TRUE"))), ""},
         {Stop(How("uint16", "")), ""},
@@ -132,12 +157,7 @@ TEST_F(OverrideTest, AMarkedElementIsAnOverrideOnlyIfItSaysSomethingElse)
         {Stop(How("uint16", "") + How("uint16", "")), "Stop(HowHow)\n"},
         {Stop(Qualifier("Description", "halts")), "Stop(How In(TRUE)) Description(halts)\n"},
         {"<METHOD NAME=\"Stop\" TYPE=\"uint16\" PROPAGATED=\"true\"></METHOD>", "Stop(How In(TRUE))\n"},
-        {"<PROPERTY NAME=\"New\" TYPE=\"string\" PROPAGATED=\"true\"></PROPERTY>", "New [0] = NULL\n"},
-    };
-    for (const auto& test : kCases) {
-        fLoading = TLoading();
-        EXPECT_EQ(test.own, OwnOf(test.elements)) << test.elements;
-    }
+    });
 }
 
 TEST_F(OverrideTest, InstancesOfTheSubclassAreKeptApartByTheKeyItDeclares)

@@ -1,5 +1,8 @@
 #include "embedded/query/TQuery.h"
 
+#include <string>
+#include <vector>
+
 #include "embedded/value/TEmbeddedObject.h"
 #include "tests/embedded/store/TInMemFixture.h"
 #include "tests/embedded/value/DateTimeOf.h"
@@ -58,6 +61,18 @@ class QueryTest : public TInMemFixture {
 
     std::string Where(const std::string& condition) { return Answer("SELECT * FROM Device WHERE " + condition); }
 
+    struct TConditionRow {
+        const char* condition;
+        const char* ids;
+    };
+
+    void ExpectAnswers(const std::vector<TConditionRow>& rows)
+    {
+        for (const TConditionRow& row : rows) {
+            EXPECT_EQ(row.ids, Where(row.condition)) << row.condition;
+        }
+    }
+
     TClassPointer fDevice, fDisk;
 };
 
@@ -78,12 +93,9 @@ TEST_F(QueryTest, StopsWhenTheCallbackReturnsFalse)
     EXPECT_EQ(3, answers);
 }
 
-TEST_F(QueryTest, EachConditionHasItsAnswer)
+TEST_F(QueryTest, TextsCompareAsTheyAreWritten)
 {
-    const struct {
-        const char* condition;
-        const char* ids;
-    } rows[] = {
+    ExpectAnswers({
         {"Id = 'sda'", "sda"},
         {"ID = \"sda\"", "sda"},
         {"Id = 'SDA'", ""},
@@ -97,6 +109,12 @@ TEST_F(QueryTest, EachConditionHasItsAnswer)
         {"Device.Id = 'fan'", "fan"},
         {"Label = 'a\\\"b\\'c\\\\d'", "sda"},
         {"Label = \"a\\\"b'c\\\\d\"", "sda"},
+    });
+}
+
+TEST_F(QueryTest, NumbersCompareByTheirValue)
+{
+    ExpectAnswers({
         {"Big = 3", "fan sda"},
         {"Big = 3.0", "fan sda"},
         {"Big = 0x3", "fan sda"},
@@ -111,6 +129,12 @@ TEST_F(QueryTest, EachConditionHasItsAnswer)
         {"Share >= 5e-1", "cpu sda"},
         {"Big = Share", "sda"},
         {"Big > Small", "cpu"},
+    });
+}
+
+TEST_F(QueryTest, OtherValuesCompareIfTheyHaveAnOrder)
+{
+    ExpectAnswers({
         {"On = TRUE", "cpu"},
         {"On <> true", "fan"},
         {"On = FALSE", "fan"},
@@ -121,6 +145,12 @@ TEST_F(QueryTest, EachConditionHasItsAnswer)
         {"Grade > 'a'", "cpu"},
         {"Next = 'root/cimv2:Device.Id=\"fan\"'", "sda"},
         {"Next <> 'x'", "sda"},
+    });
+}
+
+TEST_F(QueryTest, NullIsNeitherEqualNorUnequal)
+{
+    ExpectAnswers({
         {"Big IS NULL", "sdb"},
         {"Big is not null", "cpu fan sda"},
         {"Tags IS NOT NULL", "sda"},
@@ -133,6 +163,12 @@ TEST_F(QueryTest, EachConditionHasItsAnswer)
         {"NOT (Big = 3 OR On = TRUE)", ""},
         {"Big = 3 AND Share = 3 OR Id = 'cpu'", "cpu sda"},
         {"Big = 3 AND (Share = 3 OR Id = 'fan')", "fan sda"},
+    });
+}
+
+TEST_F(QueryTest, PatternsAndClassesHaveTheirAnswers)
+{
+    ExpectAnswers({
         {"Id LIKE 'sd%'", "sda sdb"},
         {"Id LIKE 'sd[^a]'", "sdb"},
         {"NOT Id LIKE '%a%'", "cpu sdb"},
@@ -148,10 +184,7 @@ TEST_F(QueryTest, EachConditionHasItsAnswer)
         {"Next ISA Disk", ""},
         {"1 = 1", "cpu fan sda sdb"},
         {"'a' = 'b'", ""},
-    };
-    for (const auto& row : rows) {
-        EXPECT_EQ(row.ids, Where(row.condition)) << row.condition;
-    }
+    });
 }
 
 TEST_F(QueryTest, ALongConditionIsNotADeepOne)

@@ -1,5 +1,7 @@
 #include "embedded/store/TLikelySlots.h"
 
+#include <iterator>
+#include <sstream>
 #include <string>
 #include <vector>
 
@@ -37,46 +39,15 @@ TEST(LikelySlots, ANameWhoseEntryIsTakenIsGuessedAgain)
 
 TEST(LikelySlots, NearlyAllNamesOfALargeClassAreGuessed)
 {
-    const std::vector<std::string> names = {"InstanceID",
-                                            "Caption",
-                                            "Description",
-                                            "ElementName",
-                                            "InstallDate",
-                                            "Name",
-                                            "OperationalStatus",
-                                            "StatusDescriptions",
-                                            "Status",
-                                            "HealthState",
-                                            "CommunicationStatus",
-                                            "DetailedStatus",
-                                            "OperatingStatus",
-                                            "PrimaryStatus",
-                                            "EnabledState",
-                                            "OtherEnabledState",
-                                            "RequestedState",
-                                            "EnabledDefault",
-                                            "TimeOfLastStateChange",
-                                            "AvailableRequestedStates",
-                                            "TransitioningToState",
-                                            "SystemCreationClassName",
-                                            "SystemName",
-                                            "CreationClassName",
-                                            "DeviceID",
-                                            "PowerManagementSupported",
-                                            "PowerManagementCapabilities",
-                                            "Availability",
-                                            "StatusInfo",
-                                            "LastErrorCode",
-                                            "ErrorDescription",
-                                            "ErrorCleared",
-                                            "OtherIdentifyingInfo",
-                                            "PowerOnHours",
-                                            "TotalPowerOnHours",
-                                            "IdentifyingDescriptions",
-                                            "AdditionalAvailability",
-                                            "MaxQuiesceTime",
-                                            "DataOrganization",
-                                            "Purpose"};
+    std::istringstream text(
+        "InstanceID Caption Description ElementName InstallDate Name OperationalStatus StatusDescriptions Status "
+        "HealthState CommunicationStatus DetailedStatus OperatingStatus PrimaryStatus EnabledState OtherEnabledState "
+        "RequestedState EnabledDefault TimeOfLastStateChange AvailableRequestedStates TransitioningToState "
+        "SystemCreationClassName SystemName CreationClassName DeviceID PowerManagementSupported "
+        "PowerManagementCapabilities Availability StatusInfo LastErrorCode ErrorDescription ErrorCleared "
+        "OtherIdentifyingInfo PowerOnHours TotalPowerOnHours IdentifyingDescriptions AdditionalAvailability "
+        "MaxQuiesceTime DataOrganization Purpose");
+    const std::vector<std::string> names{std::istream_iterator<std::string>(text), std::istream_iterator<std::string>()};
     TLikelySlots slots;
     for (std::uint32_t slot = 0; slot < names.size(); ++slot) {
         slots.Add(names[slot], slot);

@@ -1,18 +1,34 @@
 #include <gtest/gtest.h>
 
+#include <string_view>
+#include <vector>
+
 #include "embedded/value/TUtf8.h"
 
 namespace NORVZEL20 {
 namespace {
 
-TEST(Utf8Test, EachTextBeginsWithItsCharacterOrWithNone)
+struct TUtf8Row {
+    std::string_view text;
+    char32_t code;
+    std::size_t length;
+    const char* kind;
+};
+
+void ExpectFirst(const std::vector<TUtf8Row>& rows)
 {
-    const struct {
-        std::string_view text;
-        char32_t code;
-        std::size_t length;
-        const char* kind;
-    } rows[] = {
+    for (const TUtf8Row& row : rows) {
+        const TUtf8::TCharacter character = TUtf8::Decode(row.text);
+        const char* const kind = character.IsOverlong() ? "overlong" : (character.IsScalar() ? "good" : "no scalar");
+        EXPECT_EQ(row.code, character.code) << row.text;
+        EXPECT_EQ(row.length, character.length) << row.text;
+        EXPECT_STREQ(row.kind, kind) << row.text;
+    }
+}
+
+TEST(Utf8Test, ATextBeginsWithItsCharacter)
+{
+    ExpectFirst({
         {std::string_view("\0", 1), 0, 1, "good"},
         {"a", 'a', 1, "good"},
         {"\x7F\x80", 0x7F, 1, "good"},
@@ -30,6 +46,12 @@ TEST(Utf8Test, EachTextBeginsWithItsCharacterOrWithNone)
         {"\xED\xA0\x80", 0xD800, 3, "no scalar"},
         {"\xED\xBF\xBF", 0xDFFF, 3, "no scalar"},
         {"\xF4\x90\x80\x80", 0x110000, 4, "no scalar"},
+    });
+}
+
+TEST(Utf8Test, WhatIsNoCharacterIsOneByteWithoutALength)
+{
+    ExpectFirst({
         {"\x80", 0x80, 0, "good"},
         {"\xBF\xBF", 0xBF, 0, "good"},
         {"\xC0\x80", 0xC0, 0, "good"},
@@ -43,14 +65,7 @@ TEST(Utf8Test, EachTextBeginsWithItsCharacterOrWithNone)
         {"\xE2\x28\xA1", 0xE2, 0, "good"},
         {"\xF0\x9F\x98", 0xF0, 0, "good"},
         {"\xF0\x9F\x98z", 0xF0, 0, "good"},
-    };
-    for (const auto& row : rows) {
-        const TUtf8::TCharacter character = TUtf8::Decode(row.text);
-        const char* const kind = character.IsOverlong() ? "overlong" : (character.IsScalar() ? "good" : "no scalar");
-        EXPECT_EQ(row.code, character.code) << row.text;
-        EXPECT_EQ(row.length, character.length) << row.text;
-        EXPECT_STREQ(row.kind, kind) << row.text;
-    }
+    });
 }
 
 TEST(Utf8Test, ACharacterIsValidIfTheStandardAllowsIt)
