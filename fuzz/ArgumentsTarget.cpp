@@ -4,8 +4,8 @@
 // What follows a line "%%" becomes the file "x". The client runs inside this process with a console that keeps what it writes.
 // The status must be 0, 1 or 2, an error must leave no result and no file, and the second run must equal the first.
 
-#include <algorithm>
 #include <mutex>
+#include <utility>
 #include <vector>
 
 #include "client/CommandLine.h"

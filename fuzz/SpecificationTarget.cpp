@@ -3,8 +3,6 @@
 // An accepted file must give rules for classes of the schema and log nothing. A refused file must throw kParseError (9) and log the
 // reason with its line. Both readings must give the same rules.
 
-#include <algorithm>
-
 #include "fuzz/Promise.h"
 #include "fuzz/SampleInventory.h"
 #include "fuzz/TFuzzTarget.h"

@@ -2,7 +2,6 @@
 
 #include <sys/stat.h>
 
-#include <cstddef>
 #include <memory>
 #include <optional>
 #include <string>

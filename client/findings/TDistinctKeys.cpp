@@ -1,7 +1,5 @@
 #include "client/findings/TDistinctKeys.h"
 
-#include <algorithm>
-
 #include "client/inventory/CollectObjects.h"
 #include "client/inventory/PropertyValue.h"
 #include "embedded/value/TNameText.h"

@@ -1,6 +1,6 @@
 #include "client/noise/FindTops.h"
 
-#include <algorithm>
+#include <iterator>
 
 namespace NORVZEL20 {
 

@@ -15,7 +15,6 @@
 #include "client/text/MatchesWildcards.h"
 #include "client/text/NearestWord.h"
 #include "client/text/QuoteForShell.h"
-#include "client/text/SomeOf.h"
 
 namespace NORVZEL20 {
 

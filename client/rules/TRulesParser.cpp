@@ -11,7 +11,6 @@
 // A tag's name alone says little: inside "value" any start tag is ignored, and any end tag ends the value.
 #include "client/rules/TRulesParser.h"
 
-#include <algorithm>
 #include <boost/algorithm/string/predicate.hpp>
 #include <utility>
 

@@ -8,6 +8,7 @@
 #include <boost/algorithm/string/split.hpp>
 #include <boost/algorithm/string/trim.hpp>
 #include <limits>
+#include <optional>
 #include <vector>
 
 #include "client/text/DisplayText.h"

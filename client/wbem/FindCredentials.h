@@ -1,12 +1,9 @@
 #pragma once
 
 #include <functional>
-#include <optional>
 #include <string>
 
 #include "client/wbem/TCurlTransport.h"
-#include "client/wbem/TWbemAddress.h"
-#include "client/wbem/TWbemCredentials.h"
 #include "client/wbem/TWbemServer.h"
 
 namespace NORVZEL20 {

@@ -1,7 +1,5 @@
 #include "embedded/cimxml/ReadObjectKey.h"
 
-#include <string>
-
 #include "embedded/cimxml/TCimXmlObjectReader.h"
 #include "embedded/cimxml/TCimXmlPathReader.h"
 #include "embedded/load/TLoadContext.h"

@@ -8,7 +8,6 @@
 #include <algorithm>
 #include <boost/ref.hpp>
 #include <boost/smart_ptr/make_shared.hpp>
-#include <memory>
 #include <string_view>
 
 #include "embedded/cimxml/ReadObjectKey.h"

@@ -5,6 +5,7 @@
 #include "embedded/cimxml/TCimXmlElement.h"
 
 #include <array>
+#include <cstddef>
 #include <cstring>
 #include <string_view>
 

@@ -1,7 +1,5 @@
 #pragma once
 
-#include <cstddef>
-
 #include "host/Export.h"
 
 namespace NORVZEL20 {

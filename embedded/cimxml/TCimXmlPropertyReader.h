@@ -1,7 +1,5 @@
 #pragma once
 
-#include <cstddef>
-
 #include "embedded/cimxml/TCimXmlAttributes.h"
 #include "embedded/cimxml/TCimXmlDraftBuilder.h"
 #include "embedded/cimxml/TCimXmlItem.h"

@@ -18,6 +18,7 @@
 #include "embedded/cimxml/TCimXmlTable.h"
 
 #include <array>
+#include <cstddef>
 #include <vector>
 
 namespace NORVZEL20 {

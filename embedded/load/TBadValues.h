@@ -3,7 +3,6 @@
 #include <cstddef>
 #include <map>
 #include <string>
-#include <string_view>
 #include <utility>
 #include <vector>
 

@@ -2,7 +2,6 @@
 
 #include <boost/function.hpp>
 #include <boost/smart_ptr/shared_ptr.hpp>
-#include <cstddef>
 #include <cstdint>
 #include <memory>
 #include <set>

@@ -5,7 +5,6 @@
 #include <optional>
 #include <string>
 #include <string_view>
-#include <utility>
 #include <vector>
 
 #include "embedded/load/IPlaceSource.h"
@@ -17,7 +16,6 @@
 #include "embedded/load/TLoadReport.h"
 #include "embedded/load/TOwnPlaceSearch.h"
 #include "embedded/load/TPopulateError.h"
-#include "embedded/load/TTextPlace.h"
 #include "embedded/load/TTextPool.h"
 #include "host/Export.h"
 

@@ -8,8 +8,6 @@
 // The declaration gives the type, the flavor and the value of what a qualifier leaves out.
 #include "embedded/mof/TMofQualifierParser.h"
 
-#include <utility>
-
 #include "embedded/load/MessageText.h"
 #include "embedded/mof/TMofTypeParser.h"
 #include "embedded/mof/TMofTyping.h"

@@ -6,6 +6,8 @@
 
 #include "embedded/store/THashIndex.h"
 
+#include <utility>
+
 namespace NORVZEL20 {
 
 void THashIndex::Place(std::vector<TEntry>& entries, std::size_t at, TEntry entry) noexcept

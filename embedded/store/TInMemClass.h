@@ -2,7 +2,6 @@
 
 #include <boost/smart_ptr/enable_shared_from_this.hpp>
 #include <boost/smart_ptr/weak_ptr.hpp>
-#include <cstdint>
 #include <string>
 #include <string_view>
 #include <vector>

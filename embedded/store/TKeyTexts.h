@@ -1,7 +1,6 @@
 #pragma once
 
 #include <boost/function.hpp>
-#include <cstddef>
 #include <string>
 #include <string_view>
 

@@ -2,7 +2,6 @@
 
 #include <boost/smart_ptr/shared_ptr.hpp>
 #include <string>
-#include <string_view>
 #include <vector>
 
 #include "embedded/store/TInMemNamespace.h"

@@ -10,7 +10,6 @@
 // without keys.
 
 #include <algorithm>
-#include <cstring>
 
 #include "embedded/value/TNameText.h"
 #include "embedded/value/TReferenceContents.h"

@@ -3,7 +3,6 @@
 #include <malloc.h>
 
 #include <cstdlib>
-#include <cstring>
 #include <functional>
 #include <memory>
 

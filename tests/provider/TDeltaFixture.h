@@ -3,7 +3,6 @@
 #include <gtest/gtest.h>
 
 #include <functional>
-#include <string>
 
 #include "tests/support/StatusOf.h"
 #include "tests/support/TCapturingLogger.h"

@@ -4,7 +4,6 @@
 #include "tests/support/Dump.h"
 
 #include <set>
-#include <vector>
 
 #include "spec/TDiffClassRules.h"
 #include "tests/support/CallText.h"

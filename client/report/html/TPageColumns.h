@@ -2,8 +2,6 @@
 
 #include <array>
 #include <cstddef>
-#include <string>
-#include <string_view>
 
 #include "client/files/TSpooledText.h"
 

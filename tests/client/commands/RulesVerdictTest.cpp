@@ -1,5 +1,4 @@
 // The commands that read a rules file agree on whether it can be used, and why not.
-#include <algorithm>
 #include <filesystem>
 
 #include "fuzz/SampleInventory.h"

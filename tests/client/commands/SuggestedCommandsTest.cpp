@@ -1,7 +1,6 @@
 #include <sys/stat.h>
 
 #include <cstdlib>
-#include <functional>
 
 #include "client/inventory/TSuggestedCommand.h"
 #include "tests/client/Documents.h"

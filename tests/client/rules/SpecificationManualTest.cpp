@@ -1,6 +1,5 @@
 // What docs/specification-file.md promises, sentence by sentence, with the plug-in itself.
 
-#include <algorithm>
 #include <filesystem>
 #include <regex>
 

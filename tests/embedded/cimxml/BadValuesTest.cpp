@@ -1,7 +1,6 @@
 #include <gtest/gtest.h>
 
 #include <string>
-#include <vector>
 
 #include "embedded/cimxml/TCimXmlDocuments.h"
 #include "embedded/load/TLoadSession.h"

@@ -1,6 +1,5 @@
 #include "tests/embedded/cimxml/MutateXml.h"
 
-#include <algorithm>
 #include <iterator>
 #include <string_view>
 
