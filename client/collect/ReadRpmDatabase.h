@@ -1,6 +1,5 @@
 #pragma once
 
-#include <string>
 #include <vector>
 
 #include "client/collect/TCollection.h"
@@ -9,8 +8,7 @@
 namespace NORVZEL20 {
 
 /// The packages of rpm's database, the earliest installed first; none if there is no database. What cannot be read is left out of
-/// the collection. The
-/// database is not changed; a lock is taken only if a log of changes is beside it.
+/// the collection. The database is not changed; a lock is taken only if a log of changes is beside it.
 std::vector<TRpmPackage> ReadRpmDatabase(TCollection& collection);
 
 }  // namespace NORVZEL20

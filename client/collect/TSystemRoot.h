@@ -36,7 +36,7 @@ class TSystemRoot {
     /// The names in a folder in ascending order, without "." and "..". On failure it is empty, and `trouble` says why, except that
     /// a folder that is missing has no names.
     std::vector<TFolderEntry> List(const std::string& path, std::string& trouble) const;
-    /// The same for folders of which it does not matter why they cannot be read.
+    /// The same if it does not matter why the folder cannot be read.
     std::vector<TFolderEntry> List(const std::string& path) const;
 
     /// Where a link leads; nothing if it is no link or cannot be read.

@@ -1,7 +1,8 @@
 // A comparison in steps:
 //
 // (1) Complete the inventories: each then declares what the others declare. With --strict-schema, leave them as they are.
-// (2) Read the rules; if there are none, make rules that include every class. What options select of that becomes new rules, so that
+// (2) Read the rules; if there are none, make rules that include every class. What options select of that becomes new rules, so
+// that
 //     nothing but rules decides. The plug-in reads rules from files only and by name, so it gets a temporary file. It holds exactly
 //     what was read here: a file could change meanwhile, and standard input is gone.
 // (3) Find out what will be compared. This must be done before the run, which may add instances to the reference.
@@ -215,7 +216,7 @@ void TComparison::RemoveMadeSystems(TDeltaNamespace& records)
 // With exactly two namespaces the plug-in brings the reference in line with the other one, instance by instance. That fails if keys
 // or types differ or a value does not fit its type, and changes instances that are yet to be compared if a static value differs.
 // Three namespaces are only read. So if the other one is added twice, the reference stays as it is, and every record names two
-// positions, of which one is removed.
+// positions. One of them is removed.
 bool TComparison::MustKeepReference() const
 {
     if (fInventories.size() != 2) {

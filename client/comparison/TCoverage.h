@@ -51,7 +51,7 @@ struct TCoverage {
         std::vector<std::size_t> compared;       ///< those of the inventory that the comparison looked for in the others
         std::vector<TLeftOut> leftOut;           ///< ascending by name; empty unless the state is kCompared
         std::vector<std::string> excludedKeys;   ///< in the order of the rules, also those that are no keys of the class
-        std::vector<std::string> ignoredKeys;    ///< those of them that are keys, which hence do not identify instances
+        std::vector<std::string> ignoredKeys;    ///< those of them that are keys, so they do not identify instances
         std::vector<std::size_t> sharing;        ///< instances that have the key of an earlier one, because keys are excluded
         std::vector<std::size_t> sharingAlone;   ///< those of `sharing` whose key the reference lacks; none of the reference itself
         std::vector<std::string> referenceKeys;  ///< excluded keys that were left out of references, in the order of the rules
@@ -88,11 +88,10 @@ struct TCoverage {
     std::vector<TBadValues> badValues;  ///< by inventory, then in the order of the files
     std::vector<TLack> lacks;           ///< by inventory, then in the order of its instances
     std::vector<TName> names;           ///< by inventory, if keys or references were changed or do not have the name
-    std::optional<TNameHint> hint;      ///< a class of which nothing matches because systems are called differently
+    std::optional<TNameHint> hint;      ///< a class without a match, because systems are called differently
 
     /// Whether there were instances to compare, and every instance of every inventory was compared in every property, references
-    /// as a whole, every value as what its type says,
-    /// and no inventory says that it lacks anything.
+    /// as a whole, every value as what its type says, and no inventory says that it lacks anything.
     bool IsComplete() const;
     /// The same, times of collection aside: a class whose default is to include is compared without them.
     bool IsCompleteButForTimes() const;

@@ -104,7 +104,7 @@ void TArchiveReader::Fail() const
     if (fXzEnd.HasOtherData() || Contains(reason, "Unknown frame descriptor")) {
         FailDamaged(fName, fKind, kSomethingFollows);
     }
-    // The compression libraries describe data that ends early in several ways, not all of which a person would understand.
+    // The compression libraries describe data that ends early in several ways, some of them for programmers only.
     const bool endsEarly = Contains(reason, "No progress is possible") || Contains(reason, "runcated");
     FailDamaged(fName, fKind, endsEarly ? "it ends early" : reason);
 }

@@ -6,7 +6,7 @@
 
 namespace NORVZEL20 {
 
-/// The bytes of another source, of which the first can be looked at before they are read.
+/// The bytes of another source; the first ones can be looked at before they are read.
 class TPeekedSource : public IByteSource {
   public:
     /// Reads the first `count` bytes of `source`, or all of them if there are fewer. `source` must outlive this. Errors: those of

@@ -10,7 +10,7 @@ namespace NORVZEL20 {
 
 /// Text that other code of this process can read as a file, by a path. Nothing of it is left when this object is destroyed.
 ///
-/// The file is an anonymous one (see TAnonymousFile), of which nothing is left however the process ends. If there can be none, it
+/// The file is an anonymous one (see TAnonymousFile), so nothing of it is left however the process ends. If there can be none, it
 /// is a file in the folder that the environment variable TMPDIR names, or in /tmp, which a signal that ends the process removes
 /// too.
 class TTemporaryFile {

@@ -12,8 +12,8 @@ namespace NORVZEL20 {
 /// for the first file that cannot be read. The message ends with the names of the others.
 void CheckInventoryFiles(const std::vector<std::string>& paths);
 
-/// Checks that standard input and each pipe are to be read only once by the inventories, their schema and the rules, of which an
-/// empty path is none. Errors: TClientError.
+/// Checks that standard input and each pipe are to be read only once by the inventories, their schema and the rules. An empty
+/// path of rules means none. Errors: TClientError.
 void RequireReadableOnce(const std::vector<TInventorySources>& inventories, const std::vector<std::string>& schemas,
                          const std::string& rules);
 

@@ -10,9 +10,6 @@
 // If the client also makes the rules, they exclude the class: what the client has made says nothing about the systems.
 #include "client/inventory/MakeMissingOperatingSystems.h"
 
-#include <algorithm>
-
-#include "client/inventory/CollectObjects.h"
 #include "client/inventory/FindDeclarations.h"
 #include "client/inventory/PropertyValue.h"
 #include "client/process/TClientError.h"
@@ -150,7 +147,7 @@ boost::shared_ptr<TInMemClass> DeclareClass(const std::vector<TInventory>& inven
     return cls;
 }
 
-// Any value of the type, for a key of which nothing is known.
+// Any value of the type, for a key about which nothing is known.
 TCIMValue SomeValue(TCIMValue::TCIMType type, const std::string& className)
 {
     switch (type) {

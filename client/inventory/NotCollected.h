@@ -19,7 +19,7 @@ struct TNotCollected {
 };
 
 /// What the inventory says that it lacks, in the order of its instances. Instances without a kind or a reason are left
-/// out. Errors: none but std::bad_alloc.
+/// out. Errors: std::bad_alloc.
 std::vector<TNotCollected> FindNotCollected(TInMemNamespace& ns);
 
 /// A document of CIM-XML that names what was not collected, with the declaration of the class if `declares`. It stands in that

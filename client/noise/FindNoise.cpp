@@ -1,5 +1,5 @@
-// (1) Compare. If instances come and go, find keys without which they match, or else leave out classes of which nothing matches;
-//     repeat this with those rules until nothing more of the kind is found. Only then it is known which instances belong together.
+// (1) Compare. If instances come and go, find keys without which they match, or else leave out classes without a match;
+//     repeat this with those rules until nothing more of the kind is found. Only then is it known which instances belong together.
 // (2) Leave out the properties that differ.
 // (3) Compare again: what differs now is not explained.
 #include "client/noise/FindNoise.h"

@@ -17,7 +17,7 @@ struct TVaryingKeys {
     std::size_t unmatched = 0;  ///< the instances that do not match with them
 };
 
-/// Finds such keys for the classes of `draft` at `positions`, of which instances come and go under `rules`. An instance counts as
+/// Finds such keys for the classes of `draft` at `positions`, whose instances come and go under `rules`. An instance counts as
 /// matched only if at least half of its compared properties are equal. Keys are named if at least half of the instances match and
 /// more than half of the instances of each inventory keep a key of their own. Of several, those with which most match, and of
 /// these the fewest and first ones.

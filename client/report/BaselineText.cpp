@@ -41,7 +41,7 @@ std::string Verdict(const TBaselineOutcome& outcome)
                                : "Compared with " + file + ": " + changes + "; " + std::to_string(outcome.accepted) + " accepted";
 }
 
-// The entry without values, of which an instance can have many.
+// The entry without its values; an instance can have many.
 std::string Subject(TAcceptedDifference entry)
 {
     if (entry.kind == TDifference::kOnlyInOthers) {

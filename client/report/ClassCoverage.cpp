@@ -251,7 +251,7 @@ class TClassStatements {
         WriteLines(lines);
     }
 
-    // By the class that names the group, of which each class is a part of one.
+    // By the class that names the group; each class is in one group only.
     void WriteLines(const std::map<std::string, std::string>& lines)
     {
         for (const auto& [top, line] : lines) {

@@ -25,7 +25,7 @@
 //                                      "withinLongerTexts": [ { "key": "Port.Id", "texts": 2 } ] } ],
 //                   "hints": [ { "kind": "systemName", "class": "Disk", "property": "SystemName", "instances": [ 1, 1 ] } ] } }
 //
-// A class of which cimdelta made instances ends with "madeIn": [ "web02" ]. A note may end with "before": "model", the spelling
+// A class with instances that cimdelta made ends with "madeIn": [ "web02" ]. A note may end with "before": "model", the spelling
 // that was replaced, or with "declared": "Bag" and "declaredAsIn": "Ordered"; its kind decides, also whether it has "property".
 //
 // JsonGroups.cpp shows the groups, JsonDifference.cpp the differences. Lists of numbers have one for each inventory, the reference

@@ -65,7 +65,7 @@ std::string Compared(const TComparisonReport& report)
     return line + (report.coverage.IsComplete() ? "" : kSeeCoverage) + "\n";
 }
 
-// Classes of which instances are there that were not compared. Those that the client made do not count.
+// Classes with instances that were not compared. Instances that the client made do not count.
 std::string NotCompared(const TComparisonReport& report)
 {
     std::vector<std::string> names;

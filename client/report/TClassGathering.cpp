@@ -1,12 +1,13 @@
-// How classes are gathered. Of Device, Fan, Disk and Tape (Fan and Disk below Device, Tape below Disk) the same may be said of
+// How classes are gathered. Device, Fan, Disk and Tape are given, Fan and Disk below Device, Tape below Disk. If the same is said
+// of
 //
 //   all four           Device and 3 classes below it
 //   Fan, Disk, Tape    2 groups: Fan; Disk and 1 class below it. "3 classes below Device" would be as true, but only if nothing
-//                      can be said of Device itself, because it has no instances.
+//                      can be said about Device itself, because it has no instances.
 //   Device, Tape       2 groups: Device; Tape
 //
 // The classes stand in one list, each behind its superclass. A pass from the end of the list adds up how many of the classes at and
-// below each one are meant; those of which all are meant can name a group. A pass from the beginning finds the highest of them.
+// below each one are meant; a class with all of these meant can name a group. A pass from the beginning finds the highest of them.
 #include "client/report/TClassGathering.h"
 
 #include "client/text/Counted.h"
@@ -56,8 +57,8 @@ std::size_t TClassGathering::Find(const std::string& name, const TCoverage& cove
     return fPositions.at(name);
 }
 
-// For each class of `said`, the position of the highest class at or above it of which all at and below it are in `said`; its own if
-// there is none.
+// For each class of `said`, the position of the highest class at or above it that has all classes at and below it in `said`; its
+// own if there is none.
 std::vector<std::size_t> TClassGathering::FindTops(const std::vector<const TCoverage::TClass*>& said) const
 {
     std::vector<std::size_t> counts(fNodes.size(), 0);

@@ -10,7 +10,7 @@
 
 namespace NORVZEL20 {
 
-/// Classes of which one thing is said, under one name.
+/// Classes about which the same is said, under one name.
 struct TClassGroup {
     std::string top;                                ///< the class whose name the group has
     std::string name;                               ///< for people: "Fan", "Fan and 2 classes below it", "2 classes below Device"
@@ -20,11 +20,11 @@ struct TClassGroup {
 /// Names many classes by few names, those of classes above them.
 class TClassGathering {
   public:
-    /// `among` are the classes of which something may be said; no class is twice in it. The arguments must outlive this.
+    /// `among` are the classes about which something may be said; no class is twice in it. The arguments must outlive this.
     TClassGathering(const TCoverage& coverage, const std::vector<const TCoverage::TClass*>& among);
 
     /// The groups of the classes `said`, some of those of the constructor, in ascending order of the tops. A group under a class
-    /// holds all classes at and below it of which something may be said, so it is clear which ones are meant. The group is as large
+    /// holds all classes of `among` at and below it, so it is clear which ones are meant. The group is as large
     /// as possible and its top as low as possible. A class that is in no such group is one of its own. Cost: a step for each class
     /// of the trees.
     std::vector<TClassGroup> Gather(const std::vector<const TCoverage::TClass*>& said) const;
@@ -33,7 +33,7 @@ class TClassGathering {
     struct TNode {
         std::string name;
         std::size_t above = 0;   ///< position of the superclass; its own if it has none
-        std::size_t own = 0;     ///< 1 if something may be said of the class itself
+        std::size_t own = 0;     ///< 1 if something may be said about the class itself
         std::size_t total = 0;   ///< of how many classes at and below it something may be said
         std::size_t lowest = 0;  ///< the lowest class with the same ones at and below it
     };

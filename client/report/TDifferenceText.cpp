@@ -1,4 +1,4 @@
-// One difference is a line for the instance, and below it a line for each property of which values are shown:
+// One difference is a line for the instance, and below it a line for each property with values to show:
 //
 //   Id="sdb"  (in web02, web03)
 //       Size: web02: 250 / web03: NULL                               instances that the reference lacks, if they differ

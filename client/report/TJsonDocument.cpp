@@ -12,7 +12,7 @@ namespace {
 const char kMemberStart[] = "\n  ";
 const char kElementStart[] = "\n    ";
 
-// The text of a value within others, of which each line but the first begins like `start`. Texts in it have no line ends.
+// The text of a value within others: each line but the first begins like `start`. Texts in it have no line ends.
 std::string Within(const char* start, const nlohmann::ordered_json& value)
 {
     const std::string text = WriteJson(value, true);

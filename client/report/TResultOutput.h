@@ -48,7 +48,7 @@ class TResultOutput {
     /// Takes the next piece of the result.
     void Write(std::string_view piece);
 
-    /// Delivers the result, of which `end` is the last piece. Call this once.
+    /// Delivers the result; `end` is its last piece. Call this once.
     void Deliver(std::string_view end = std::string_view());
 
   private:

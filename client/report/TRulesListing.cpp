@@ -259,7 +259,7 @@ boost::shared_ptr<TInMemClass> TRulesListing::RequireDeclared(const std::string&
                        TSuggestedCommand("show").AddInventory(fInventories.front()).Advise("lists those of the first one"));
 }
 
-// The plug-in lists an included property in the spelling of the rules, hence without regard to letter case.
+// The plug-in lists an included property in the spelling of the rules, so letter case does not matter here.
 TRulesListing::TNames TRulesListing::ComparedIn(const boost::shared_ptr<TInMemClass>& cls)
 {
     const std::vector<std::string> properties = fRules.PropertiesOf(cls);

@@ -13,7 +13,7 @@ namespace NORVZEL20 {
 /// with dashes and colons.
 class TValueWords {
   public:
-    /// Of a property of which no declaration is known.
+    /// Of a property whose declaration is not known.
     TValueWords() = default;
     /// Reads the qualifiers ValueMap, Values, PUnit and Units.
     explicit TValueWords(const ICIMPropertyDecl& declaration);

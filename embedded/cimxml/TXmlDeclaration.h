@@ -10,7 +10,7 @@ class TXmlDeclaration {
     TXmlDeclaration() = delete;
 
     /// Moves `at`, the beginning of a document, over the declaration, if there is one. Refuses versions and encodings other than
-    /// these, and a document of which only a blank is there. The bytes end at `end`, and a NUL is there.
+    /// these, and a document that is only a blank so far. The bytes end at `end`, and a NUL is there.
     static EXmlScan Pass(const char*& at, const char* end) noexcept;
 
     /// Accepts what begins at `at` as the beginning of another document, behind the end of one: a start tag whose name begins with

@@ -1,7 +1,7 @@
 // Two parsers, one after the other.
 //
 // A document begins with the tokenizer. When it meets a token that it does not accept, Expat goes on from there: it gets the start
-// tags of the open elements, of which the sink sees nothing, then the refused token and all that follows. Lines and columns are
+// tags of the open elements, which the sink does not see again, then the refused token and all that follows. Lines and columns are
 // shifted to where the token stands. So nothing that has been read need be kept, and whether a document is in error, why and where,
 // is always said by Expat.
 //
@@ -104,7 +104,8 @@ bool TXmlReader::Scan(std::size_t length, bool last)
     }
 }
 
-/// From now on Expat reads: what the tokenizer has left of earlier bytes, then `bytes`, of which the tokenizer has had `done`.
+/// From now on Expat reads: what the tokenizer has left of earlier bytes, then `bytes` without the first `done`, which the
+/// tokenizer has had.
 bool TXmlReader::Leave(std::string_view bytes, bool last, std::size_t done)
 {
     const TXmlProgress progress = fTokenizer->TakeProgress();

@@ -4,7 +4,7 @@
 
 namespace NORVZEL20 {
 
-/// Documents that were read, but of which something waits for other documents of the load: see TLoadSession::AddLate. Of MOF,
+/// Documents that were read, and hold something that waits for other documents of the load: see TLoadSession::AddLate. In MOF,
 /// these are all instances, and classes with a qualifier that was not declared in front of them.
 class ILateDocuments {
   public:

@@ -5,7 +5,7 @@
 
 namespace NORVZEL20 {
 
-/// A property of which a load has met values that do not fit their type. The first of them is the example.
+/// A property with values that do not fit its type, as a load has met them. The first of them is the example.
 struct TBadProperty {
     std::string className;
     std::string property;

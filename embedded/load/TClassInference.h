@@ -24,7 +24,7 @@ class TClassInference {
     void Note(const TDraft& instance);
 
     /// The classes in the order of their first instances, and an entry for each in TLoadReport::inferred. Errors: kNotFound (15)
-    /// for a class of which no instance has a name, because its keys are not known then.
+    /// if no instance of a class has a name, because the keys of the class are not known then.
     std::vector<TDraft> MakeClasses() const;
 
     /// The declarations of the qualifiers that these classes have.

@@ -8,7 +8,7 @@
 
 namespace NORVZEL20 {
 
-/// The packages of dpkg's list (var/lib/dpkg/status) as KALMO_Package. Packages of which nothing is left are left out.
+/// The packages of dpkg's list (var/lib/dpkg/status) as KALMO_Package. Packages with nothing left on the system are left out.
 std::vector<TFacts> ReadDpkgStatus(std::string_view text, TReadFaults& faults);
 
 }  // namespace NORVZEL20

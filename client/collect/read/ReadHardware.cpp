@@ -1,8 +1,7 @@
 // What the kernel says of processors and memory.
 //
 //   cpuinfo    a paragraph for each logical processor, with lines "name : value"; those of one socket have one "physical id".
-//   Machines
-//              that have no such line (ARM among others) count as one socket
+//              Machines without such a line (ARM among others) count as one socket
 //   meminfo    lines "MemTotal:       16303428 kB"
 //   swaps      a heading, then lines with file, type, size, used size (both in KiB) and priority
 #include "client/collect/read/ReadHardware.h"
