@@ -68,7 +68,7 @@ TInMemExtent& TInMemClass::GetExtent() const
     return *fExtent;
 }
 
-void TInMemClass::ShareRecent(std::uint32_t slot, TCIMValue& value) const noexcept
+void TInMemClass::ShareRecent(std::uint32_t slot, TCIMValue& value) const
 {
     if (fExtent) {
         fExtent->ShareRecent(slot, value);

@@ -129,7 +129,7 @@ class CIMDELTA_EXPORT TInMemClass final : public TInMemNamedElement<ICIMClass>, 
     /// The instances of exactly this class. Errors: kNotFound (15) if it is not declared, kNamespaceGone (18).
     TInMemExtent& GetExtent() const;
     /// As TInMemExtent::ShareRecent; nothing if the class is not declared.
-    void ShareRecent(std::uint32_t slot, TCIMValue& value) const noexcept;
+    void ShareRecent(std::uint32_t slot, TCIMValue& value) const;
     /// How many there are; 0 if the class is not declared.
     std::size_t GetInstanceCount() const noexcept;
     /// A new instance with every property null, at most one allocation. Its memory is part of a TInMemPage.

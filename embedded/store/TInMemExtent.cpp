@@ -233,7 +233,7 @@ void TInMemExtent::Clear() noexcept
     }
 }
 
-void TInMemExtent::ShareRecent(std::uint32_t slot, TCIMValue& value) const noexcept
+void TInMemExtent::ShareRecent(std::uint32_t slot, TCIMValue& value) const
 {
     if (!TValueAccess::HasBlock(value)) {
         return;

@@ -53,7 +53,8 @@ class TInMemExtent {
 
     /// Puts the block of a value that one of the instances added last has in that slot in the place of `value`, if nobody could
     /// tell the two apart. So what instances made one after the other have in common is in memory once.
-    void ShareRecent(std::uint32_t slot, TCIMValue& value) const noexcept;
+    /// Errors: std::bad_alloc, and then nothing has changed.
+    void ShareRecent(std::uint32_t slot, TCIMValue& value) const;
 
     /// Calls back until the callback returns false, and then returns false. Instances may be added and removed meanwhile; those
     /// added are left out.

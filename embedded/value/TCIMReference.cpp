@@ -182,7 +182,7 @@ void TCIMReference::AddKeyValue(const std::string& name, const TCIMValue& value)
         throw TZELException(TZELStatusCode::kInvalidParameter);
     }
     TContents& contents = Own();
-    auto& bindings = contents.bindings;
+    TKeyBindings& bindings = contents.bindings;
     // Keys mostly come in their order.
     const std::size_t count = bindings.GetCount();
     if (count == 0 || TNameText::Compare(bindings.GetName(count - 1), name) < 0) {
@@ -263,8 +263,7 @@ std::string TCIMReference::GetPath() const
     TCountingOut count;
     WriteParts(count, className);
     if (count.IsPlain() && TContents::FindPlace(fContents) == nullptr) {
-        path = std::string(count.GetLength(),
-                           '\0');  // cheaper than growing the empty text to that length
+        path = std::string(count.GetLength(), '\0');  // cheaper than growing the empty text to that length
         TPlainOut out(path.data());
         WriteParts(out, className);
         return path;

@@ -12,8 +12,9 @@ namespace NORVZEL20 {
 /// The key bindings of a path, each a name and a value, in the order in which they are put in, with the frame of the path, which
 /// holds the names.
 ///
-/// Paths that are made for their text have the same names again and again. So Clear keeps the frame with the names, if nobody
-/// else uses it, and the memory of the values. Positions must be less than GetCount().
+/// Paths that are made for their text have the same names again and again. So Clear keeps the frame with the names, if nobody else
+/// uses it, and the memory of the values.
+/// Positions must be less than GetCount().
 class TKeyBindings {
   public:
     TKeyBindings() noexcept : fOne() {}

@@ -13,8 +13,8 @@
 
 namespace NORVZEL20 {
 
-/// What the paths to all instances of a class have in common: everything but the values of their keys. Paths share it until one
-/// of them needs another.
+/// What the paths to all instances of a class have in common: everything but the values of their keys. Paths share it until one of
+/// them needs another.
 ///
 /// Threads: any, at any time, for reading. Only code that uses it alone may change it.
 struct TPathFrame : TCounted {

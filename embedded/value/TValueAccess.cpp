@@ -1,5 +1,5 @@
 // The bytes of a value (TCIMValue.cpp draws their layout). Everything here relies on the form, which the caller has checked, and
-// nothing throws: a caller makes a block before it stores the pointer.
+// only ShareFrame throws: a caller makes a block before it stores the pointer.
 
 #include "embedded/value/TValueAccess.h"
 
@@ -100,14 +100,11 @@ bool TValueAccess::HasSameFrame(const TCIMValue& a, const TCIMValue& b) noexcept
     return left != nullptr && right != nullptr && left->bindings.HasSameFrame(right->bindings);
 }
 
-void TValueAccess::ShareFrame(TCIMValue& value, const TCIMValue& other) noexcept
+void TValueAccess::ShareFrame(TCIMValue& value, const TCIMValue& other)
 {
     // The value is not const, and so the path in it is not either.
     TCIMReference& path = const_cast<TCIMReference&>(GetPath(value));
-    try {
-        path.Own().bindings.ShareFrame(GetPath(other).fContents->bindings);
-    } catch (const std::bad_alloc&) {
-    }
+    path.Own().bindings.ShareFrame(GetPath(other).fContents->bindings);
 }
 
 TCIMValue TValueAccess::FromBits(TCIMValue::TCIMType type, std::uint64_t bits) noexcept

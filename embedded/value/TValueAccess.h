@@ -59,14 +59,14 @@ class CIMDELTA_INTERNAL_EXPORT TValueAccess {
         return ((words[0][0] ^ words[1][0]) | (words[0][1] ^ words[1][1])) == 0;
     }
 
-    /// Whether a is written like b in everything, so that no reader could say which of the two it reads. False for embedded
-    /// objects that are not the same one. Cost: of a path or an array, that of their parts.
+    /// Whether a is written like b in everything, so that no reader could say which of the two it reads. False for embedded objects
+    /// that are not the same one. Cost: of a path or an array, that of their parts.
     static bool IsIndistinguishable(const TCIMValue& a, const TCIMValue& b) noexcept;
     /// Whether both are paths, and alike in all but the values of their keys.
     static bool HasSameFrame(const TCIMValue& a, const TCIMValue& b) noexcept;
-    /// Lets `value` use the memory for what it has in common with `other`. Both must have the same frame. If memory is short,
-    /// does nothing.
-    static void ShareFrame(TCIMValue& value, const TCIMValue& other) noexcept;
+    /// Lets `value` use the memory for what it has in common with `other`. Both must have the same frame. Errors: std::bad_alloc,
+    /// and then nothing has changed.
+    static void ShareFrame(TCIMValue& value, const TCIMValue& other);
     /// Whether a value holds a block of its own or shares one.
     static bool HasBlock(const TCIMValue& value) noexcept { return value.fForm >= kSharedText; }
 
