@@ -1,15 +1,14 @@
 #include "client/baseline/ApplyBaseline.h"
 
-#include <algorithm>
 #include <boost/algorithm/string/trim.hpp>
 #include <memory>
 #include <utility>
 
+#include "client/baseline/FindBadCharacter.h"
 #include "client/baseline/TBaselineReview.h"
 #include "client/baseline/TUnacceptedDifferences.h"
 #include "client/process/TClientError.h"
 #include "client/text/DisplayText.h"
-#include "embedded/value/TUtf8.h"
 
 namespace NORVZEL20 {
 
@@ -28,10 +27,7 @@ std::optional<TBaseline> ApplyBaseline(TComparisonReport& report, TBaseline base
 
 void CheckReason(const std::string& reason)
 {
-    const std::size_t invalid = TUtf8::FindInvalid(reason);
-    const bool hasControl =
-        std::any_of(reason.begin(), reason.end(), [](char one) { return (one >= 0 && one < ' ') || one == '\x7f'; });
-    if (hasControl || invalid < reason.size()) {
+    if (FindBadCharacter(reason) < reason.size()) {
         throw TClientError("found --reason " + QuoteForDisplay(reason) +
                            ", expected one line of text in UTF-8; leave out what is shown as \\n or the like");
     }

@@ -3,6 +3,8 @@
 #include <algorithm>
 #include <string>
 
+#include "client/baseline/FindEndOfQuoted.h"
+
 namespace NORVZEL20 {
 
 namespace {
@@ -25,19 +27,17 @@ std::size_t LengthOfEscape(std::string_view text, char quote)
 
 std::size_t FindBadEscape(std::string_view text)
 {
-    char quote = '\0';  // around the character at hand; NUL if there is none
-    for (std::size_t i = 0; i < text.size(); ++i) {
-        if (quote == '\0') {
-            quote = text[i] == '"' || text[i] == '\'' ? text[i] : '\0';
-        } else if (text[i] == quote) {
-            quote = '\0';
-        } else if (text[i] == '\\') {
-            const std::size_t length = LengthOfEscape(text.substr(i), quote);
+    std::size_t open = text.find_first_of("\"'");
+    while (open != std::string_view::npos) {
+        const std::size_t end = FindEndOfQuoted(text, open);
+        for (std::size_t at = text.find('\\', open); at < end;) {
+            const std::size_t length = LengthOfEscape(text.substr(at), text[open]);
             if (length == 0) {
-                return i;
+                return at;
             }
-            i += length - 1;
+            at = text.find('\\', at + length);
         }
+        open = end == std::string_view::npos ? end : text.find_first_of("\"'", end + 1);
     }
     return std::string_view::npos;
 }

@@ -3,11 +3,12 @@
 #include <cstddef>
 #include <string_view>
 
+#include "client/baseline/FindEndOfQuoted.h"
+
 namespace NORVZEL20 {
 
 /// Calls back with the position of each character that is not within quotes, nor a quote, as long as it returns true. Double and
-/// single quotes count; within them a backslash takes the next character as it is. Returns the position of the
-/// quote that is not closed, or npos.
+/// single quotes count; FindEndOfQuoted says where they end. Returns the position of the quote that is not closed, or npos.
 template <class TCallback>
 std::size_t ForEachUnquoted(std::string_view text, const TCallback& callback)
 {
@@ -18,13 +19,11 @@ std::size_t ForEachUnquoted(std::string_view text, const TCallback& callback)
             }
             continue;
         }
-        const std::size_t opened = i;
-        for (++i; i < text.size() && text[i] != text[opened]; ++i) {
-            i += text[i] == '\\' ? 1 : 0;
+        const std::size_t end = FindEndOfQuoted(text, i);
+        if (end == std::string_view::npos) {
+            return i;
         }
-        if (i >= text.size()) {
-            return opened;
-        }
+        i = end;
     }
     return std::string_view::npos;
 }

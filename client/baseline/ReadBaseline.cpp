@@ -7,6 +7,7 @@
 #include <utility>
 #include <vector>
 
+#include "client/baseline/FindBadCharacter.h"
 #include "client/baseline/ParseEntry.h"
 #include "client/files/TInputFile.h"
 #include "client/process/TClientError.h"
@@ -92,17 +93,12 @@ class TBaselineParser {
 
     void CheckCharacters(std::string_view text) const
     {
-        const std::size_t invalid = TUtf8::FindInvalid(text);
-        const auto control = static_cast<std::size_t>(
-            std::find_if(text.begin(), text.end(),
-                         [](char one) { return (one >= 0 && one < ' ' && one != '\t') || one == '\x7f'; }) -
-            text.begin());
-        const std::size_t bad = std::min(invalid, control);
+        const std::size_t bad = FindBadCharacter(text);
         if (bad == text.size()) {
             return;
         }
         const std::string shown = EscapeForDisplay(text.substr(bad, 1));
-        Refuse(bad + 1, bad == invalid
+        Refuse(bad + 1, bad == TUtf8::FindInvalid(text)
                             ? "found the byte " + shown + ", which is no UTF-8; save the file as UTF-8"
                             : "found the control character " + shown + "; remove it, or write it within quotes as " + shown);
     }

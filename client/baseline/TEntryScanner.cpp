@@ -4,6 +4,7 @@
 #include <utility>
 
 #include "client/baseline/FindBadEscape.h"
+#include "client/baseline/FindEndOfQuoted.h"
 #include "client/baseline/ForEachUnquoted.h"
 #include "client/process/TClientError.h"
 #include "client/text/CutText.h"
@@ -66,11 +67,8 @@ void TEntryScanner::CheckQuotes(std::size_t begin, std::size_t end, std::size_t 
 std::size_t TEntryScanner::EndOfQuoted(std::size_t offset) const
 {
     const std::size_t begin = fBegin + offset;
-    std::size_t end = begin + 1;
-    for (; end < fText.size() && fText[end] != fText[begin]; ++end) {
-        end += fText[end] == '\\' ? 1 : 0;
-    }
-    const bool isClosed = end < fText.size();
+    const std::size_t end = FindEndOfQuoted(fText, begin);
+    const bool isClosed = end != std::string_view::npos;
     CheckQuotes(begin, isClosed ? end + 1 : begin, isClosed ? std::string_view::npos : 0);
     return end + 1 - fBegin;
 }

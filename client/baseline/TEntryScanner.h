@@ -26,7 +26,8 @@ class TEntryScanner {
     /// Takes so many characters of it. Errors: those of Take.
     void Skip(std::size_t length);
 
-    /// Where the text in quotes ends that begins so many characters behind the beginning of the next field. Errors: those of Take.
+    /// Behind the text in quotes that stands `offset` characters behind the beginning of the next field: how many characters that
+    /// is from there. Errors: those of Take.
     std::size_t EndOfQuoted(std::size_t offset) const;
 
     /// Throws a TClientError that names the file, the line, the column of the next field and what it is. `expected` goes on with
