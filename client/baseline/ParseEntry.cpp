@@ -11,7 +11,6 @@
 
 #include <algorithm>
 #include <cctype>
-#include <map>
 #include <utility>
 
 #include "client/baseline/EntryText.h"
@@ -19,6 +18,7 @@
 #include "client/baseline/TDifferenceStates.h"
 #include "client/baseline/TEntryScanner.h"
 #include "client/baseline/TakeValue.h"
+#include "embedded/value/TNameText.h"
 
 namespace NORVZEL20 {
 
@@ -115,7 +115,7 @@ class TEntryParser {
     // Only an instance that the reference lacks has any.
     std::vector<TAcceptedDifference::TValue> Contents(TDifference::EKind kind)
     {
-        std::map<std::string, std::string> contents;
+        TNameMap<std::string> contents;
         bool isMore = kind == TDifference::kOnlyInOthers && fScanner.Peek() != "in";
         while (isMore) {
             if (contents.count(fScanner.Peek().substr(0, fScanner.Peek().find(':'))) > 0) {

@@ -11,12 +11,12 @@ namespace NORVZEL20 {
 
 namespace {
 
-using TKeyNames = std::set<std::string, TNameText::TLess>;
-
 bool IsBefore(const TAcceptedDifference::TValue& one, const TAcceptedDifference::TValue& other)
 {
-    return one.property < other.property;
+    return TNameText::Compare(one.property, other.property) < 0;
 }
+
+using TNames = std::set<std::string, TNameText::TLess>;
 
 std::string ClassOf(const TAcceptedDifference& entry)
 {
@@ -24,9 +24,9 @@ std::string ClassOf(const TAcceptedDifference& entry)
 }
 
 // Of Disk.Id="sda",Bus=1: Id and Bus.
-TKeyNames KeyNamesOf(const std::string& instance)
+TNames KeyNamesOf(const std::string& instance)
 {
-    TKeyNames names;
+    TNames names;
     std::size_t begin = instance.find('.');
     while (begin < instance.size()) {
         ++begin;
@@ -80,10 +80,10 @@ bool TAcceptance::IsCompared(const TAcceptedDifference& entry) const
 bool TAcceptance::IsKeyed(const TAcceptedDifference& entry) const
 {
     const std::string className = ClassOf(entry);
-    const TKeyNames named = KeyNamesOf(entry.instance);
+    const TNames named = KeyNamesOf(entry.instance);
     return std::any_of(fReport.inventories->begin(), fReport.inventories->end(), [&](const TInventory& inventory) {
         const boost::shared_ptr<TInMemClass> cls = inventory.ns->FindClass(className);
-        TKeyNames names;
+        TNames names;
         for (const std::uint32_t slot : cls ? cls->GetLayout().GetKeys() : std::vector<std::uint32_t>()) {
             const std::string key = cls->GetLayout().GetDecl(slot).GetName();
             if (entry.kind == TDifference::kOnlyInReference || !fReport.meaning->ExcludesKey(className, key)) {
@@ -106,8 +106,8 @@ TAcceptance::TNames TAcceptance::FindCompared(const std::string& className) cons
 {
     const boost::shared_ptr<TInMemClass> declared = GetReference().ns->FindClass(className);
     const std::vector<TCoverage::TClass>& classes = fReport.coverage.classes;
-    const auto covered =
-        std::find_if(classes.begin(), classes.end(), [&](const TCoverage::TClass& cls) { return cls.name == className; });
+    const auto covered = std::find_if(classes.begin(), classes.end(),
+                                      [&](const TCoverage::TClass& cls) { return TNameText::Equal(cls.name, className); });
     if (!declared || (covered != classes.end() && covered->state != TCoverage::kCompared)) {
         return TNames();
     }

@@ -1,6 +1,5 @@
 #pragma once
 
-#include <map>
 #include <memory>
 #include <optional>
 #include <set>
@@ -10,6 +9,7 @@
 #include "client/baseline/TBaseline.h"
 #include "client/baseline/TDifferenceStates.h"
 #include "client/comparison/TComparisonReport.h"
+#include "embedded/value/TNameText.h"
 
 namespace NORVZEL20 {
 
@@ -43,7 +43,7 @@ class TAcceptance {
     bool IsReference(const std::string& label) const { return fReport.labels.front() == label; }
 
   private:
-    using TNames = std::set<std::string>;
+    using TNames = std::set<std::string, TNameText::TLess>;
 
     bool IsKeyed(const TAcceptedDifference& entry) const;
     const TNames& ComparedOf(const std::string& className) const;
@@ -51,7 +51,7 @@ class TAcceptance {
 
     const std::shared_ptr<const TBaseline> fBaseline;
     const TComparisonReport& fReport;
-    mutable std::map<std::string, TNames> fCompared;  // the properties of each class that was asked for
+    mutable TNameMap<TNames> fCompared;  // the properties of each class that was asked for
 };
 
 }  // namespace NORVZEL20

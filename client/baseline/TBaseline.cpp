@@ -12,6 +12,8 @@
 #include <utility>
 
 #include "client/baseline/EntryText.h"
+#include "client/baseline/ForEachUnquoted.h"
+#include "embedded/value/TNameText.h"
 
 namespace NORVZEL20 {
 
@@ -24,9 +26,15 @@ std::string PropertyOf(const TAcceptedDifference& entry)
     return entry.kind == TDifference::kChanged ? entry.values.front().property : std::string();
 }
 
+// Names count in any letter case, the values of keys as they are. TRUE, FALSE and numbers have one spelling each.
 std::string AboutText(TDifference::EKind kind, const std::string& instance, const std::string& property)
 {
-    return SignOf(kind) + instance + '\n' + property;
+    std::string names = instance;
+    ForEachUnquoted(instance, [&names](std::size_t at) {
+        names[at] = TNameText::ToLower(names[at]);
+        return true;
+    });
+    return SignOf(kind) + names + '\n' + TNameText::ToLower(property);
 }
 
 bool HaveCommon(const std::vector<std::string>& one, const std::vector<std::string>& other)

@@ -10,7 +10,8 @@
 
 namespace NORVZEL20 {
 
-/// Accepted differences, found by what they are about. No two of them say the same of the same inventory.
+/// Accepted differences, found by what they are about. No two of them say the same of the same inventory. The letter case of names
+/// of classes, keys and properties does not count.
 class TBaseline {
   public:
     /// Adds an entry. If there is one that differs in nothing but inventories, reason and comments, the two become one. If there is

@@ -4,11 +4,11 @@
 
 #include <algorithm>
 #include <boost/algorithm/string/join.hpp>
-#include <map>
 
 #include "client/baseline/EntryText.h"
 #include "client/baseline/ValueIdentity.h"
 #include "client/text/DisplayText.h"
+#include "embedded/value/TNameText.h"
 
 namespace NORVZEL20 {
 
@@ -68,7 +68,7 @@ std::vector<TAcceptedDifference::TValue> TDifferenceStates::ValuesOf(std::size_t
 
 std::vector<TAcceptedDifference::TValue> TDifferenceStates::ContentsOf(std::size_t inventory) const
 {
-    std::map<std::string, std::string> contents;
+    TNameMap<std::string> contents;
     for (const auto& [property, value] : fDifference.contents) {
         contents[property] = ValueIdentity(value, value.IsBag());
     }

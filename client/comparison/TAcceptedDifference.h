@@ -5,6 +5,7 @@
 #include <vector>
 
 #include "client/comparison/TDifference.h"
+#include "embedded/value/TNameText.h"
 
 namespace NORVZEL20 {
 
@@ -19,7 +20,8 @@ struct TAcceptedDifference {
 
     TDifference::EKind kind;
     std::string instance;        ///< the class and the key
-    std::vector<TValue> values;  ///< of kChanged the property, of kOnlyInOthers what the instance holds, ascending by name
+    std::vector<TValue> values;  ///< of kChanged the property, of kOnlyInOthers what the instance holds, ascending by name in any
+                                 ///< letter case
     std::vector<std::string> inventories;    ///< labels, ascending, each once
     std::string reason = std::string();      ///< why it is accepted; empty if nobody said
     std::vector<std::string> comments = {};  ///< the lines of comment above it
@@ -28,7 +30,7 @@ struct TAcceptedDifference {
 
 inline bool operator==(const TAcceptedDifference::TValue& one, const TAcceptedDifference::TValue& other)
 {
-    return one.property == other.property && one.before == other.before && one.after == other.after;
+    return TNameText::Equal(one.property, other.property) && one.before == other.before && one.after == other.after;
 }
 
 }  // namespace NORVZEL20

@@ -10,12 +10,14 @@
 
 #include <algorithm>
 #include <boost/algorithm/string/join.hpp>
+#include <set>
 #include <vector>
 
 #include "client/baseline/EntryText.h"
 #include "client/text/Counted.h"
 #include "client/text/DisplayText.h"
 #include "client/text/SomeOf.h"
+#include "embedded/value/TNameText.h"
 #include "embedded/value/TUtf8.h"
 
 namespace NORVZEL20 {
@@ -54,7 +56,7 @@ std::string Subject(TAcceptedDifference entry)
 std::string AfterOf(const std::vector<TAcceptedDifference::TValue>& values, const std::string& property)
 {
     for (const TAcceptedDifference::TValue& value : values) {
-        if (value.property == property) {
+        if (TNameText::Equal(value.property, property)) {
             return value.after;
         }
     }
@@ -64,14 +66,12 @@ std::string AfterOf(const std::vector<TAcceptedDifference::TValue>& values, cons
 // The values of two accounts of one instance that are not the same: those of the first, and behind them those of the second.
 std::string ContentsChange(const TBaselineOutcome::TChanged& changed)
 {
-    std::vector<std::string> properties;
+    std::set<std::string, TNameText::TLess> properties;
     for (const auto* const values : {&changed.present.values, &changed.accepted.values}) {
         for (const TAcceptedDifference::TValue& value : *values) {
-            properties.push_back(value.property);
+            properties.insert(value.property);
         }
     }
-    std::sort(properties.begin(), properties.end());
-    properties.erase(std::unique(properties.begin(), properties.end()), properties.end());
     std::vector<std::string> present;
     std::vector<std::string> accepted;
     for (const std::string& property : properties) {

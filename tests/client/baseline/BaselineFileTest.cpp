@@ -51,6 +51,7 @@ TEST(BaselineFileTest, EntriesAreReadAndWrittenInOneSpelling)
         {"~ A P: \"1\" -> \"2\" in a\n~ A P: \"1\" -> \"3\" in b\n~ A Q: \"1\" -> \"3\" in a",
          "~ A P: \"1\" -> \"2\" in a\n~ A P: \"1\" -> \"3\" in b\n~ A Q: \"1\" -> \"3\" in a\n"},
         {"- A in a\ncimdelta-baseline 1\n- B in a", "- A in a\n- B in a\n"},
+        {"- Disk.Id=\"A\" in a\n- disk.ID=\"A\" in b\n- disk.ID=\"a\" in b", "- Disk.Id=\"A\" in a, b\n- disk.ID=\"a\" in b\n"},
         {"# of B\n# and more\n- B in a\n- A in a", "- A in a\n# of B\n# and more\n- B in a\n"},
     };
     for (const auto& test : kCases) {
@@ -133,6 +134,7 @@ TEST(BaselineFileTest, WhatIsNoEntryIsRefusedWithItsPlace)
         {"+ A P: \"1\" Q: \"2\" in a",
          "12: found Q:, expected a comma and another property, or \"in\" and the labels of inventories"},
         {"+ A P: \"1\", in a", "13: found in, expected a property with a colon behind it, such as Size:"},
+        {"+ A P: \"1\", p: \"2\" in a", "13: found p:, expected each property once; remove one of them"},
         {"+ A P: \"1\", P: \"2\" in a", "13: found P:, expected each property once; remove one of them"},
         {"+ A (instances): many in a", "18: found many, expected a number of instances"},
         {"+ A P: \"1\"",

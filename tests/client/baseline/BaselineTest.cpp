@@ -184,6 +184,34 @@ TEST_F(BaselineTest, InstancesThatShareAKeyAreCounted)
     EXPECT_NE(std::string::npos, again.find("1 new; 0 accepted")) << again;
 }
 
+TEST_F(BaselineTest, LetterCaseOfNamesDoesNotCount)
+{
+    const auto write = [this](const std::string& cls, const std::string& key, const std::string& property, const TDisks& disks) {
+        for (const auto& [label, size] : TDisks{{"web01", "1"}, {"web02", "2"}}) {
+            std::string contents = Class(cls, "", KeyProperty(key) + Declaration(property, "uint16"));
+            contents += Instance(cls, Value(key, "SDA") + Value(property, size, "uint16"));
+            for (const auto& [id, sizeOfDisk] : label == "web02" ? disks : TDisks()) {
+                contents += Instance(cls, Value(key, id) + Value(property, sizeOfDisk, "uint16"));
+            }
+            SystemWith(label, contents);
+        }
+    };
+    write("DISK", "ID", "SIZE", {{"sdb", "2"}});
+    Accept();
+    const std::string accepted =
+        "~ DISK.ID=\"SDA\" SIZE: uint16 1 -> uint16 2 in web02\n+ DISK.ID=\"sdb\" SIZE: uint16 2 in web02\n";
+    EXPECT_EQ(accepted, Entries());
+    write("Disk", "Id", "Size", {{"sdb", "2"}});
+    EXPECT_EQ("Nothing new between web01 and web02 since base.txt: 2 accepted differences.\n", Since());
+    Accept();
+    EXPECT_EQ(accepted, Entries());
+    write("Disk", "Id", "Size", {{"SDB", "2"}, {"sdb", "3"}});
+    const std::string since = Since();
+    EXPECT_EQ("Compared with base.txt: 1 new, 1 changed since; 1 accepted\n"
+              "  changed  + Disk.Id=\"sdb\" in web02; has Size: uint16 3; accepted: Size: uint16 2\n",
+              since.substr(since.find("Compared with")));
+}
+
 TEST_F(BaselineTest, ReasonsAndCommentsStayWithWhatStillHolds)
 {
     System("web02", {{"sda", "2"}, {"sdb", "6"}, {"sdc", "7"}});
