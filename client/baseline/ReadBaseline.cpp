@@ -22,6 +22,8 @@ namespace {
 constexpr std::size_t kBlockSize = 64 * 1024;
 constexpr std::size_t kMostBytes = static_cast<std::size_t>(1) << 30;
 constexpr char kByteOrderMark[] = "\xEF\xBB\xBF";
+constexpr char kMergeAdvice[] = " of a merge that is not finished; keep the entries of both sides, but one for a difference, "
+                                "and remove the lines with the marks, and those between ||||||| and =======";
 
 // The mark of a merge conflict at the beginning of the line; null if there is none.
 const char* FindMergeMark(std::string_view text)
@@ -58,10 +60,7 @@ class TBaselineParser {
         if (text[begin] == '#') {
             fComments.emplace_back(text.substr(begin));
         } else if (const char* const mark = FindMergeMark(text)) {
-            Refuse(1, "found " + std::string(mark) +
-                          " of a merge that is not finished; keep the entries of both sides, but one for a difference, and remove "
-                          "the lines with <<<<<<<, "
-                          "======= and >>>>>>>");
+            Refuse(1, "found " + std::string(mark) + kMergeAdvice);
         } else if (IsMark(text.substr(begin))) {
             CheckVersion(text.substr(begin + sizeof kBaselineMark - 1), begin + sizeof kBaselineMark);
         } else {

@@ -99,10 +99,9 @@ TEST(BaselineFileTest, WhatIsNoBaselineIsRefused)
 TEST(BaselineFileTest, AMergeThatIsNotFinishedIsRefused)
 {
     for (const std::string mark : {"<<<<<<<", "|||||||", "=======", ">>>>>>>"}) {
-        const std::string message =
-            "1: found " + mark +
-            " of a merge that is not finished; keep the entries of both sides, but one for a difference, and remove the lines with "
-            "<<<<<<<, ======= and >>>>>>>";
+        const std::string message = "1: found " + mark +
+                                    " of a merge that is not finished; keep the entries of both sides, but one for a difference, "
+                                    "and remove the lines with the marks, and those between ||||||| and =======";
         ExpectRefusal(message, mark + " ours\n");
         EXPECT_EQ("base.txt:1:" + message, ReadAndWrite(mark + " ours\n" + kFirstLine));
     }
