@@ -87,8 +87,9 @@ struct TCoverage {
     std::vector<TSchemaNote> notes;     ///< what was done to make the inventories comparable, in that order
     std::vector<TBadValues> badValues;  ///< by inventory, then in the order of the files
     std::vector<TLack> lacks;           ///< by inventory, then in the order of its instances
-    std::vector<TName> names;           ///< by inventory, if keys or references were changed or do not have the name
-    std::optional<TNameHint> hint;      ///< a class without a match, because systems are called differently
+    /// By inventory, if its keys or references were changed or do not have the name, or if TOwnName::isCommon.
+    std::vector<TName> names;
+    std::optional<TNameHint> hint;  ///< a class without a match, because systems are called differently
 
     /// Whether there were instances to compare, and every instance of every inventory was compared in every property, references
     /// as a whole, every value as what its type says, and no inventory says that it lacks anything.

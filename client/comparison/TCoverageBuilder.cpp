@@ -42,7 +42,7 @@ TCoverage TCoverageBuilder::Build()
         }
         for (const TOwnName& name : fInventories[i].ownNames) {
             const bool isUnused = !name.isInKeys && !TNameText::Equal(name.name, name.comparedAs);
-            if (name.replaced + name.marked > 0 || isUnused) {
+            if (name.replaced + name.marked > 0 || isUnused || name.isCommon) {
                 coverage.names.push_back({i, name});
             }
         }

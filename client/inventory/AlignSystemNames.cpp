@@ -152,21 +152,23 @@ class TSameNames {
         return list;
     }
 
-    // Which of several names is the own one is not to be guessed.
-    void RefuseTie(const TInventory& inventory, const TNames& names, const TNameCounts& counts, const TNameCount& own) const
+    // Which of several names is the own one is not to be guessed. `place` says where they were counted.
+    static void RefuseTie(const TInventory& inventory, const TNames& names, const TNameCounts& counts, const TNameCount& own,
+                          const std::string& place)
     {
         for (const std::string& name : names) {
             const auto found = counts.find(name);
             if (found != counts.end() && found->second == own.second && !TNameText::Equal(found->first, own.first)) {
                 throw TClientError(inventory.path + ": has the names " + EscapeForDisplay(own.first) + " and " +
-                                   EscapeForDisplay(found->first) +
-                                   " equally often in its keys and references, so its own one is not known; use --self");
+                                   EscapeForDisplay(found->first) + " equally often " + place +
+                                   ", so its own one is not known; use --self");
             }
         }
     }
 
     // The one of the names that comes most often, as the inventory spells it; empty if none does.
-    std::string FindMostFrequent(const TInventory& inventory, const TNames& names, const TNameCounts& counts) const
+    static std::string FindMostFrequent(const TInventory& inventory, const TNames& names, const TNameCounts& counts,
+                                        const std::string& place)
     {
         auto own = counts.end();
         for (const std::string& name : names) {
@@ -178,24 +180,25 @@ class TSameNames {
         if (own == counts.end()) {
             return std::string();
         }
-        RefuseTie(inventory, names, counts, *own);
+        RefuseTie(inventory, names, counts, *own, place);
         return own->first;
     }
 
-    // The inventory's own name as it spells it; empty if it has none of them. A name that is only a value stands for a system that
-    // no key names.
+    // The inventory's own name as it spells it; empty if it has none of them. Where no key holds them, values decide: first the one
+    // that is the system's name, since another system may be named more often.
     std::string FindOwn(std::size_t i, const TNames& names)
     {
         const TInventory& inventory = fInventories[i];
-        const std::string own = FindMostFrequent(inventory, names, fKeys[i]);
-        if (!own.empty()) {
-            return own;
+        const std::string inKeys = FindMostFrequent(inventory, names, fKeys[i], "in its keys and references");
+        if (!inKeys.empty()) {
+            return inKeys;
         }
         if (HasName(names, inventory.label)) {
             fLabels.insert(inventory.label);
             return FindOwnName(inventory, kSystemNameProperty);
         }
-        return FindMostFrequent(inventory, names, fValues[i]);
+        const std::string own = FindOwnNameIfAny(inventory);
+        return HasName(names, own) ? own : FindMostFrequent(inventory, names, fValues[i], "as values");
     }
 
     // A name that is nowhere is a mistake in writing.
@@ -239,6 +242,19 @@ void Replace(TInventory& inventory)
     }
 }
 
+// Notes names of the reference that no inventory has another name for, so that nothing was replaced.
+void MarkCommonNames(std::vector<TInventory>& inventories)
+{
+    for (TOwnName& used : inventories.front().ownNames) {
+        const auto isChanged = [&used](const TOwnName& own) {
+            return own.comparedAs == used.name && (own.replaced + own.marked > 0 || !TNameText::Equal(own.name, used.name));
+        };
+        used.isCommon = std::none_of(inventories.begin(), inventories.end(), [&isChanged](const TInventory& inventory) {
+            return std::any_of(inventory.ownNames.begin(), inventory.ownNames.end(), isChanged);
+        });
+    }
+}
+
 }  // namespace
 
 void CheckSystemNames(const TSystemNames& options)
@@ -261,6 +277,9 @@ void AlignSystemNames(std::vector<TInventory>& inventories, const TSystemNames& 
         if (!inventory.ownNames.empty()) {
             Replace(inventory);
         }
+    }
+    if (!options.same.empty()) {
+        MarkCommonNames(inventories);
     }
 }
 

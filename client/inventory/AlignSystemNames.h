@@ -11,15 +11,15 @@ namespace NORVZEL20 {
 void CheckSystemNames(const TSystemNames& options);
 
 /// Writes the names by which the inventories call their own systems as the reference has them, in keys and references, and notes in
-/// TInventory::ownNames what was done. Does nothing without such options, which must have passed
-/// CheckSystemNames. Call it before the schemas are completed.
+/// TInventory::ownNames what was done. Does nothing without such options, which must have passed CheckSystemNames. Call it
+/// before the schemas are completed.
 ///
-/// Of several names that mean one system, an inventory's own is the one that it has most often in keys and references; of the
-/// reference, it is the one that is used for all. A name that an inventory does not have may be its label instead: its own name is
-/// then looked for as by `self`; or it may be the value of a property. An inventory whose own name is in no key or reference stays
-/// as it is. Errors: TClientError if the reference has no own name, a name is found nowhere, or two instances would have
-/// the same keys; std::bad_alloc. Other inventories may be changed by then.
-/// Cost: some passes over the keys, references and values of each inventory.
+/// Of several names that mean one system, an inventory's own is the one that it has most often in keys and references. If they have
+/// none of them, it is the name that `self` finds, if that is one of them or one of them is the inventory's label; otherwise the
+/// one that is most often the value of a property. The reference's own name is used for all. An inventory whose own name is in no
+/// key or reference stays as it is. Errors: TClientError if the reference has no own name, an inventory has two names equally
+/// often, a name is found nowhere, or two instances would have the same keys; std::bad_alloc. Other inventories may be changed by
+/// then. Cost: some passes over the keys, references and values of each inventory.
 void AlignSystemNames(std::vector<TInventory>& inventories, const TSystemNames& options);
 
 }  // namespace NORVZEL20

@@ -64,11 +64,9 @@ bool IsComputerSystem(const TInMemClass& cls)
                        "; say which names mean the same system with --same");
 }
 
-}  // namespace
-
-std::string FindOwnName(const TInventory& inventory, const std::string& property)
+// The name, or an empty one. Counts the values of the property.
+std::string FindAmongValues(const TInventory& inventory, const std::string& property, TCounts& counts)
 {
-    TCounts counts;
     TCounts systems;
     for (const boost::shared_ptr<TInMemClass>& cls : inventory.ns->GetClasses()) {
         AddValues(counts, *cls, property);
@@ -81,10 +79,25 @@ std::string FindOwnName(const TInventory& inventory, const std::string& property
     }
     const bool isUnambiguous = TNameText::Equal(property, kSystemNameProperty) && systems.size() == 1 &&
                                (counts.empty() || counts.count(systems.begin()->first) > 0);
-    if (!isUnambiguous) {
+    return isUnambiguous ? systems.begin()->first : std::string();
+}
+
+}  // namespace
+
+std::string FindOwnName(const TInventory& inventory, const std::string& property)
+{
+    TCounts counts;
+    std::string name = FindAmongValues(inventory, property, counts);
+    if (name.empty()) {
         Refuse(inventory, property, counts);
     }
-    return systems.begin()->first;
+    return name;
+}
+
+std::string FindOwnNameIfAny(const TInventory& inventory)
+{
+    TCounts counts;
+    return FindAmongValues(inventory, kSystemNameProperty, counts);
 }
 
 }  // namespace NORVZEL20

@@ -11,4 +11,7 @@ namespace NORVZEL20 {
 /// Errors: TClientError with the most frequent values if there is no such name.
 std::string FindOwnName(const TInventory& inventory, const std::string& property);
 
+/// The same for kSystemNameProperty; empty if there is no such name.
+std::string FindOwnNameIfAny(const TInventory& inventory);
+
 }  // namespace NORVZEL20

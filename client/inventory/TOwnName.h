@@ -16,6 +16,9 @@ struct TOwnName {
     std::size_t marked = 0;
     /// Keys (Class.Key) with the name within a longer text, which stayed; and how many.
     std::map<std::string, std::size_t> within = {};
+    /// No inventory has another of the names that mean this system, and nothing was replaced. Set only in the reference, for a name
+    /// of --same.
+    bool isCommon = false;
 };
 
 /// What stands behind the name of another system that is called like the reference's own.

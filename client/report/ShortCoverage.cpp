@@ -146,13 +146,20 @@ void AddSharing(std::vector<std::string>& reservations, const TCoverage& coverag
 void AddNames(std::vector<std::string>& reservations, const TCoverage& coverage)
 {
     std::vector<std::string> unused;
+    std::vector<std::string> common;
     for (const TCoverage::TName& entry : coverage.names) {
-        if (!entry.name.isInKeys) {
+        if (entry.name.isCommon) {
+            common.push_back(QuoteForDisplay(entry.name.name));
+        } else if (!entry.name.isInKeys) {
             unused.push_back(QuoteForDisplay(entry.name.name));
         }
     }
-    if (coverage.names.size() > unused.size()) {
-        reservations.push_back(Counted(coverage.names.size() - unused.size(), "system") + " compared under another name");
+    const std::size_t replaced = coverage.names.size() - unused.size() - common.size();
+    if (replaced > 0) {
+        reservations.push_back(Counted(replaced, "system") + " compared under another name");
+    }
+    if (!common.empty()) {
+        reservations.push_back("nothing replaced, because no inventory has another name for " + SomeOf(common));
     }
     if (!unused.empty()) {
         reservations.push_back("nothing replaced, because no key or reference is " + SomeOf(unused));

@@ -93,7 +93,10 @@ class TStatement {
     {
         std::vector<std::string> names;
         for (const TCoverage::TName& entry : fCoverage.names) {
-            if (!entry.name.isInKeys) {
+            if (entry.name.isCommon) {
+                fOut +=
+                    "Nothing was replaced, because no inventory has another name for " + QuoteForDisplay(entry.name.name) + ".\n";
+            } else if (!entry.name.isInKeys) {
                 names.push_back(QuoteForDisplay(entry.name.name) + " of " + Label(entry.inventory));
             }
         }

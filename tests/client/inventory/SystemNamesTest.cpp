@@ -210,8 +210,7 @@ TEST_F(SystemNamesTest, WhatIsAmbiguousOrMissingIsRefused)
         "does not count\n",
         Compare({ArrayOf("array1", 1), ArrayOf("array2", 1)}, {"--same", "array1=array9"}));
     EXPECT_EQ("cimdelta: a.xml: has none of the names x, y, neither in its keys and references nor as a value; it is the "
-              "reference, whose "
-              "name all get\n",
+              "reference, whose name all get\n",
               Compare({ArrayOf("array1", 1), ArrayOf("array2", 1)}, {"--same", "x=y"}));
     EXPECT_EQ(
         "cimdelta: b.xml: has the names array1 and array2 equally often in its keys and references, so its own one is not known; "
@@ -276,6 +275,60 @@ TEST_F(SystemNamesTest, MachineAndArrayMeetUnderOneName)
     const std::string b = a + DiskOf("array2", "1");
     const std::string report = Compare({a, b}, {"--same", "array1=array2"});
     EXPECT_NE(std::string::npos, report.find("Disk\n+ Id=\"1\",SystemName=\"array1\"\n")) << report;
+}
+
+/// A system whose own name is a value, as are names of another one.
+std::string ArrayWithPeer(const std::string& name, const std::string& peer, const std::string& others = "")
+{
+    return Class("KALMO_ComputerSystem", "",
+                 KeyProperty("InstanceID") + Declaration("Name", "string") + Declaration("Peer", "string") +
+                     Declaration("Backup", "string")) +
+           Class("Disk", "", KeyProperty("SystemName") + KeyProperty("Id")) +
+           Instance("KALMO_ComputerSystem",
+                    Value("InstanceID", "s") + Value("Name", name) + Value("Peer", peer) + Value("Backup", peer)) +
+           others;
+}
+
+TEST_F(SystemNamesTest, NameOfTheSystemCountsMoreThanHowOftenAnotherIsNamed)
+{
+    const std::string a = ArrayWithPeer("array1", "array2");
+    const std::string report = Compare({a, ArrayWithPeer("array2", "array1", DiskOf("array2", "1"))}, {"--same", "array1=array2"});
+    EXPECT_NE(std::string::npos, report.find("Disk\n+ Id=\"1\",SystemName=\"array1\"\n")) << report;
+    EXPECT_NE(std::string::npos, report.find("\nCompared as \"array1\" in keys and references of b: \"array2\" (1 time).\n"))
+        << report;
+}
+
+TEST_F(SystemNamesTest, WhereAllHaveOneNameTheReportSaysThatNothingWasReplaced)
+{
+    const std::string said = "othing was replaced, because no inventory has another name for \"array1\".\n";
+    for (const std::string& a : {ArrayOf("array1", 1) + LinkOf("array1", "peer", "array2"), ArrayWithPeer("array1", "array2")}) {
+        const std::string report = Compare({a, a}, {"--same", "array1=array2"});
+        EXPECT_NE(std::string::npos, report.find("\nN" + said)) << report;
+        EXPECT_EQ(std::string::npos, report.find("Compared as")) << report;
+        EXPECT_EQ(std::string::npos, report.find("is the name")) << report;
+        EXPECT_EQ(std::string::npos, Compare({a, a}, {"--self"}).find("othing was replaced"));
+        EXPECT_NE(std::string::npos, Compare({a, a}, {"--same", "array1=array2", "-o", "ndjson"})
+                                         .find("\"systemNames\":[{\"inventory\":\"a\",\"name\":\"array1\",\"comparedAs\":"
+                                               "\"array1\",\"texts\":0,\"anotherSystem\":0,\"withinLongerTexts\":[]}]"));
+    }
+    const std::string a = ArrayOf("array1", 1) + LinkOf("array1", "peer", "array2");
+    EXPECT_EQ(std::string::npos, Compare({a, a, ArrayOf("array2", 1)}, {"--same", "array1=array2"}).find(said));
+    const std::string path = Scratch("c.xml", Document(System() + a));
+    const std::string other = Scratch("d.xml", Document(System() + a));
+    Run({"compare", path, other, "--same", "array1=array2"});
+    EXPECT_NE(std::string::npos,
+              fOut.find("\nnothing replaced, because no inventory has another name for \"array1\" (--coverage)\n"))
+        << fOut;
+}
+
+TEST_F(SystemNamesTest, ValuesThatDoNotSayWhichNameIsTheOwnOneAreRefused)
+{
+    const std::string two =
+        ArrayWithPeer("array1", "array2") + Instance("KALMO_ComputerSystem", Value("InstanceID", "t") + Value("Name", "array1"));
+    const std::string others =
+        Instance("KALMO_ComputerSystem", Value("InstanceID", "t") + Value("Name", "array3") + Value("Peer", "array1"));
+    EXPECT_EQ("cimdelta: b.xml: has the names array1 and array2 equally often as values, so its own one is not known; use --self\n",
+              Compare({two, ArrayWithPeer("array1", "array2") + others}, {"--same", "array1=array2"}));
 }
 
 TEST_F(SystemNamesTest, MistypedNameIsNoticedWhereNoKeyHoldsNames)
