@@ -237,8 +237,7 @@ void CheckPlainOutput(const std::string& path, const std::vector<std::string>& i
     CheckOutput(path, inputs);
     if (const std::string kind = CompressionOfName(path); !kind.empty()) {
         throw TClientError(path + ": found a name for " + kind +
-                           ", expected one for plain text, as which the file is to be read; "
-                           "give the file another name");
+                           ", but rules and accepted differences are kept as plain text; give the file another name");
     }
 }
 
@@ -247,9 +246,7 @@ TResultOutput::TResultOutput(IConsole& console, std::string path) : fConsole(con
     if (IsStandardOutput(fPath)) {
         return;
     }
-    if (const std::string kind = CompressionOfName(fPath); !kind.empty()) {
-        fCompressor = std::make_unique<TCompressor>(kind, [this](std::string_view piece) { Keep(piece); });
-    }
+    const std::string kind = CompressionOfName(fPath);
     try {
         const TTarget target = FollowLinks(fPath);
         fTarget = target.path;
@@ -260,6 +257,10 @@ TResultOutput::TResultOutput(IConsole& console, std::string path) : fConsole(con
         }
     } catch (const std::system_error& error) {
         RefuseToWrite(fPath, error);
+    }
+    // Last, since it may write at once.
+    if (!kind.empty()) {
+        fCompressor = std::make_unique<TCompressor>(kind, [this](std::string_view piece) { Keep(piece); });
     }
 }
 

@@ -22,17 +22,17 @@ bool IsStandardOutput(const std::string& path);
 bool AreSameTarget(const std::string& a, const std::string& b);
 
 /// Checks, without changing anything, whether a result can be delivered to that path and would not replace one of the `inputs`,
-/// which are paths too, with "-" for standard input, nor has a name that asks for an unknown compression. A device may still turn
-/// out to be full.
-/// Errors: TClientError.
+/// which are paths too, with "-" for standard input. A device may still turn out to be full.
+/// Errors: TClientError, also if the name asks for a compression that cannot be written.
 void CheckOutput(const std::string& path, const std::vector<std::string>& inputs);
 
 /// The same for rules and accepted differences, which are read as plain text only. Errors: also TClientError if the name asks for
 /// compression.
 void CheckPlainOutput(const std::string& path, const std::vector<std::string>& inputs);
 
-/// A result on its way to the file of a path, or to the console's standard output if IsStandardOutput(path). It takes no more
-/// memory than a TSpooledText, however long it is. If the name asks for it (CompressionOfName), it is compressed.
+/// A result on its way to the file of a path, or to the console's standard output if IsStandardOutput(path). If the name asks for
+/// it (CompressionOfName), it is compressed. Memory, however long it is: that of a TSpooledText, and of a TCompressor if it is
+/// compressed.
 ///
 /// Nothing of it is to be seen before Deliver. A file appears whole or not at all: what was there stays until the new text is on
 /// the disk. Links are followed and stay. A device, a pipe or an open descriptor (/dev/stdout) is written to, not replaced.

@@ -89,7 +89,7 @@ TEST_F(PrepareFilesTest, NamesOfCompressedFilesAreKnownBeforeInventoriesAreRead)
               Messages({"show", fSlow, "--output", fFolder / "r.bz2"}));
     for (const char* const option : {"--accept", "--save-rules"}) {
         EXPECT_EQ(
-            "cimdelta: F/r.gz: found a name for gzip, expected one for plain text, as which the file is to be read; give the file "
+            "cimdelta: F/r.gz: found a name for gzip, but rules and accepted differences are kept as plain text; give the file "
             "another name\n",
             Messages({"compare", fSlow, "web01.xml", option, fFolder / "r.gz"}));
     }

@@ -3,12 +3,15 @@
 
 #include <sys/stat.h>
 
+#include <algorithm>
 #include <cerrno>
 #include <cstring>
+#include <random>
 
 #include "client/process/TClientError.h"
 #include "client/process/TReaderGone.h"
 #include "client/process/TStandardConsole.h"
+#include "client/report/TResultOutput.h"
 #include "tests/client/TClientFixture.h"
 #include "tests/client/TOutputFolder.h"
 #include "tests/client/files/TSystemCalls.h"
@@ -30,16 +33,36 @@ class WritingFaultTest : public TClientFixture {
     void ExpectAsBefore() const
     {
         EXPECT_EQ(kBefore, ReadFile(fReport));
-        EXPECT_EQ("report ", fFolder.List());
+        EXPECT_EQ(fName + " ", fFolder.List());
     }
 
     const std::vector<std::string> WriteReport() const { return {"show", "web02.xml", "--output", fReport}; }
 
     const TOutputFolder fFolder;
-    const std::string fReport = fFolder / "report";
+    std::string fName = "report";
+    std::string fReport = fFolder / fName;
 };
 
-TEST_F(WritingFaultTest, EachCallThatFailsIsReportedAndLeavesWhatWasThere)
+/// The same for each suffix, which says how the result is compressed.
+class WritingAnyFaultTest : public WritingFaultTest, public testing::WithParamInterface<const char*> {
+  protected:
+    WritingAnyFaultTest()
+    {
+        fName += GetParam();
+        fReport += GetParam();
+    }
+
+    /// The report as it is written without a fault.
+    std::string WholeReport()
+    {
+        const TOutputFolder folder;
+        const std::string path = folder / fName;
+        Result({"show", "web02.xml", "--output", path});
+        return ReadFile(path);
+    }
+};
+
+TEST_P(WritingAnyFaultTest, EachCallThatFailsIsReportedAndLeavesWhatWasThere)
 {
     const struct {
         const char* call;
@@ -57,8 +80,9 @@ TEST_F(WritingFaultTest, EachCallThatFailsIsReportedAndLeavesWhatWasThere)
     }
 }
 
-TEST_F(WritingFaultTest, RoomThatEndsAnywhereLeavesWhatWasThere)
+TEST_P(WritingAnyFaultTest, RoomThatEndsAnywhereLeavesWhatWasThere)
 {
+    const std::string whole = WholeReport();
     int number = 0;
     for (bool reached = true; reached;) {
         TSystemCalls calls;
@@ -74,8 +98,33 @@ TEST_F(WritingFaultTest, RoomThatEndsAnywhereLeavesWhatWasThere)
     }
     EXPECT_LT(5, number);
     EXPECT_EQ(0, fStatus);
-    EXPECT_EQ(Result({"show", "web02.xml"}), ReadFile(fReport));
+    EXPECT_EQ(whole, ReadFile(fReport));
 }
+
+/// A result that is too long to wait for its end is written on the way, within the call of the library that compresses it.
+TEST_P(WritingAnyFaultTest, RoomThatEndsOnTheWayLeavesWhatWasThere)
+{
+    std::mt19937 random(1);
+    std::string noise(300000, ' ');
+    std::generate(noise.begin(), noise.end(), [&random] { return static_cast<char>(random()); });
+    TFakeConsole console;
+    TSystemCalls calls;
+    calls.Fail("write", 2, ENOSPC);
+    try {
+        TResultOutput output(console, fReport);
+        for (std::size_t at = 0; at < noise.size(); at += 1000) {
+            output.Write(std::string_view(noise).substr(at, 1000));
+        }
+        ADD_FAILURE() << "written";
+    } catch (const TClientError& error) {
+        EXPECT_EQ("R: cannot be written: No space left on device", Shorten(error.what(), fReport, "R"));
+    }
+    EXPECT_EQ(2, calls.GetCount("write"));
+    ExpectAsBefore();
+}
+
+INSTANTIATE_TEST_SUITE_P(Suffixes, WritingAnyFaultTest, testing::Values("", ".gz", ".xz", ".zst"),
+                         [](const auto& test) { return *test.param == 0 ? std::string("Plain") : std::string(test.param + 1); });
 
 TEST_F(WritingFaultTest, AnInterruptedCallIsRepeated)
 {
