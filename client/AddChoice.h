@@ -24,7 +24,7 @@ CLI::Option* AddChoice(CLI::App* command, const std::string& option, TEnum& choi
         choice = static_cast<TEnum>(found - names.begin());
     };
     return command->add_option_function(option, set, description)
-        ->transform(&UnguardArgument)
+        ->transform(&TakeGuardOff)
         ->check(&RefuseEmpty)
         ->option_text("CHOICE");
 }

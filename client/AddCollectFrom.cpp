@@ -23,7 +23,7 @@ void AddCredentials(CLI::App* command, TCollectFromOptions& options)
 {
     const std::function<void(const std::string&)> set = [&options](const std::string& file) {
         options.hasNetrc = true;
-        options.netrcFile = UnguardArgument(file);
+        options.netrcFile = TakeGuardOff(file);
     };
     command
         ->add_option_function("--netrc", set,

@@ -43,7 +43,7 @@ void AddOnly(CLI::App* command, TOnlyShown& only)
         ->add_option_function("--only", set,
                               "show only these kinds of differences: + or added, - or missing, ~ or changed; the exit\n"
                               "status counts what is shown")
-        ->transform(&UnguardArgument)
+        ->transform(&TakeGuardOff)
         ->check(&RefuseEmpty)
         ->option_text("KIND[,KIND...]");
 }

@@ -6,7 +6,7 @@ namespace NORVZEL20 {
 
 namespace {
 
-// CLI11 leaves an argument alone that begins with this character. No argument that a user means contains it.
+// CLI11 leaves an argument alone that begins with this character.
 const char kGuard = '\x01';
 
 }  // namespace

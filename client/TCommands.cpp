@@ -45,7 +45,7 @@ void AddFormat(CLI::App* command, EOutputFormat& format, const std::vector<std::
         format = OutputFormatOf(name);
     };
     command->add_option_function("-o,--format", set, Alternatives(names) + " (default: text)")
-        ->transform(&UnguardArgument)
+        ->transform(&TakeGuardOff)
         ->check(&RefuseEmpty)
         ->option_text("FORMAT");
 }
