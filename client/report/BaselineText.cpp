@@ -108,7 +108,7 @@ class TBaselineLines {
             Add(head + describe(entries[i]));
         }
         if (shown < entries.size()) {
-            Add(std::string("  ... ") + std::to_string(entries.size() - shown) + " more (--detail)");
+            Add(std::string("  ... ") + std::to_string(entries.size() - shown) + " more (" + fOptions.detailOption + ")");
         }
     }
 
@@ -121,7 +121,7 @@ class TBaselineLines {
         if (fOptions.isDetailed || fOptions.width == 0 || line.size() <= fOptions.width) {
             return line;
         }
-        return std::string(TUtf8::Shorten(line, fOptions.width)) + "... (--detail)";
+        return std::string(TUtf8::Shorten(line, fOptions.width)) + "... (" + fOptions.detailOption + ")";
     }
 
     const TTextOptions& fOptions;

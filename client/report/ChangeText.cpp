@@ -176,7 +176,7 @@ std::string ChangeText(const TValueDifference& change, const TInventoryNames& na
     }
     const std::size_t rest = change.others.size() - groups.size();
     return (elements.empty() ? values.front() + kBeforeNewValue : std::string()) + boost::algorithm::join(groups, kBetweenValues) +
-           (rest > 0 ? "   ... " + Counted(rest, "more value", "more values") + " (--detail)" : std::string());
+           (rest > 0 ? "   ... " + Counted(rest, "more value", "more values") + " (" + style.detailOption + ")" : std::string());
 }
 
 }  // namespace NORVZEL20

@@ -55,7 +55,9 @@ class TMarkdown {
   public:
     TMarkdown(const TComparisonReport& report, const TFindings& findings, const TTextOptions& options)
         : fReport(report), fFindings(findings), fOptions(options), fNames(NamesOf(report))
-    {}
+    {
+        fOptions.detailOption = "-o text --detail";  // this format has no details
+    }
 
     void Write(const TTextSink& sink) const
     {
@@ -166,7 +168,7 @@ class TMarkdown {
 
     const TComparisonReport& fReport;
     const TFindings& fFindings;
-    const TTextOptions& fOptions;
+    TTextOptions fOptions;
     const TInventoryNames fNames;
 };
 

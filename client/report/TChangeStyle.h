@@ -12,6 +12,8 @@ struct TChangeStyle {
     bool isWhole = false;                ///< whether long texts are not cut
     std::size_t mostValues = 8;          ///< how many values are written; the others are counted
     const TValueWords* words = nullptr;  ///< for the values of the property, if there are any
+    /// What shows all values, as the report names it.
+    const char* detailOption = "--detail";
 };
 
 }  // namespace NORVZEL20

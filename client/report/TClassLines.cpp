@@ -29,18 +29,11 @@ namespace NORVZEL20 {
 
 namespace {
 
-const char kSharesKey[] = "   (instances share this key: --detail)";
-
 // Whether fewer inventories are concerned.
 template <class TFinding>
 bool IsRarer(const TFinding* one, const TFinding* other)
 {
     return one->inventories.size() < other->inventories.size();
-}
-
-std::string More(std::size_t count)
-{
-    return "... " + std::to_string(count) + " more (--detail)";
 }
 
 }  // namespace
@@ -120,7 +113,8 @@ void TClassLines::AddOtherPresences(TDifference::EKind kind, std::size_t instanc
 {
     const bool isMissing = kind == TDifference::kOnlyInReference;
     fLines.push_back({"... " + Counted(instances, "more instance") +
-                          (isMissing ? " missing in various inventories" : " only in various inventories") + " (--detail)",
+                          (isMissing ? " missing in various inventories" : " only in various inventories") + " (" +
+                          fOptions.detailOption + ")",
                       kind});
 }
 
@@ -158,13 +152,13 @@ void TClassLines::AddPresenceOfFleet(const TPresenceFinding& presence)
 }
 
 // Only one of the values could be shown.
-std::string TClassLines::Disagreement(const TPresenceFinding& presence)
+std::string TClassLines::Disagreement(const TPresenceFinding& presence) const
 {
     if (presence.disagreeing == 0) {
         return std::string();
     }
     const std::string whose = presence.instances == 1 ? "its values" : "values of " + std::to_string(presence.disagreeing);
-    return "   (" + whose + " differ among them: --detail)";
+    return "   (" + whose + " differ among them: " + fOptions.detailOption + ")";
 }
 
 void TClassLines::AddPresenceOfPair(const TPresenceFinding& presence)
@@ -226,7 +220,7 @@ void TClassLines::AddOtherChanges(const std::vector<const TPropertyFinding*>& re
     }
     fLines.push_back({(fIsPair ? "~ " : "") + EscapeForDisplay(rest.front()->property) + " in " +
                           Counted(instances, "more instance") + " (" + fNames.List({inventories.begin(), inventories.end()}) +
-                          "), " + Counted(changes, "distinct change") + " (--detail)",
+                          "), " + Counted(changes, "distinct change") + " (" + fOptions.detailOption + ")",
                       TDifference::kChanged});
 }
 
@@ -242,7 +236,7 @@ std::string TClassLines::MoreChanges(const TPropertyFinding& property) const
     const bool isEnough = property.changes <= kMostExamples && !fOptions.hasWholeGroups && !fOptions.isLimitChosen;
     const std::string name = property.property.substr(0, property.property.find('.'));
     return "... " + std::to_string(property.changes - 1) + " more (" +
-           (isEnough ? "--property " + EscapeForDisplay(QuoteForShell(name)) : "--detail") + ")";
+           (isEnough ? "--property " + EscapeForDisplay(QuoteForShell(name)) : fOptions.detailOption) + ")";
 }
 
 // The first change. Its inventories are left out if they are those of the property, which stand above it.
@@ -257,8 +251,10 @@ std::string TClassLines::ExampleOf(const TPropertyFinding& property) const
 // Without the names of inventories if `isPair`.
 std::string TClassLines::Change(const TChangeFinding& change, bool isPair) const
 {
-    const TChangeStyle style{isPair, fOptions.hasWholeKeys, fMost, &fFindings.WordsFor(change.change.property)};
-    return ChangeText(change.change, fNames, style) + (change.sharing.empty() ? "" : kSharesKey);
+    const TChangeStyle style{isPair, fOptions.hasWholeKeys, fMost, &fFindings.WordsFor(change.change.property),
+                             fOptions.detailOption};
+    return ChangeText(change.change, fNames, style) +
+           (change.sharing.empty() ? std::string() : std::string("   (instances share this key: ") + fOptions.detailOption + ")");
 }
 
 // Names of several keys have commas in them.
@@ -270,7 +266,8 @@ std::string TClassLines::Shorten(const std::vector<std::string>& names, std::siz
         std::any_of(first.begin(), first.end(), [](const std::string& name) { return name.find(',') != std::string::npos; });
     const char* const separator = haveCommas ? "; " : ", ";
     const std::string text = boost::algorithm::join(first, separator);
-    return shown < count ? text + separator + More(count - shown) : text;
+    return shown < count ? text + separator + "... " + std::to_string(count - shown) + " more (" + fOptions.detailOption + ")"
+                         : text;
 }
 
 std::vector<std::string> TClassLines::Contents(const TPresenceFinding::TExample& example) const

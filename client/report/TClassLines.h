@@ -43,7 +43,7 @@ class TClassLines {
     void AddPresence(const TPresenceFinding& presence);
     void AddPresenceOfFleet(const TPresenceFinding& presence);
     void AddOtherPresences(TDifference::EKind kind, std::size_t instances);
-    static std::string Disagreement(const TPresenceFinding& presence);
+    std::string Disagreement(const TPresenceFinding& presence) const;
     void AddPresenceOfPair(const TPresenceFinding& presence);
     void AddProperties(std::vector<const TPropertyFinding*> ofOne);
     void AddProperty(const TPropertyFinding& property);

@@ -16,6 +16,8 @@ struct TTextOptions {
     std::size_t width = 120;        ///< columns at which contents are cut; 0 for no limit
     std::size_t mostLines = 0;      ///< how long the findings may be if groups are shortened; 0 for no limit
     bool isLimitChosen = false;     ///< whether a person chose that, so that it also holds for the properties that are asked for
+    /// What shows all that is shortened, as the report names it.
+    const char* detailOption = "--detail";
 };
 
 }  // namespace NORVZEL20

@@ -90,6 +90,24 @@ TEST_F(MarkdownFormatTest, AGroupThatTheTextWouldShortenIsFolded)
               Report(Packages(9, "1"), Packages(9, "2")));
 }
 
+/// The option alone would do nothing in this format.
+TEST_F(MarkdownFormatTest, WhatALongGroupLeavesOutIsInTheDetailedText)
+{
+    const std::string declared = Class("Package", "", KeyProperty("Name") + Declaration("Version", "string"));
+    std::string a = declared;
+    std::string b = declared;
+    for (int i = 0; i < 201; ++i) {
+        const std::string name = std::to_string(i);
+        a += Instance("Package", Value("Name", "c" + name) + Value("Version", "1" + name)) +
+             Instance("Package", Value("Name", "gone" + name));
+        b += Instance("Package", Value("Name", "c" + name) + Value("Version", "2" + name));
+    }
+    const std::string report = Compare({a, b}, {"-o", "markdown"});
+    EXPECT_NE(std::string::npos, report.find("... 1 more (-o text --detail)`\n")) << report;
+    EXPECT_NE(std::string::npos, report.find("... 200 more (-o text --detail)`\n")) << report;
+    EXPECT_EQ(std::string::npos, report.find("(--detail)")) << report;
+}
+
 TEST_F(MarkdownFormatTest, OutliersAreComparisonsOfTwo)
 {
     const std::string report = Result({"compare", "-o", "markdown", "--outliers", "web01.xml", "web02.xml", "web03.xml"});
