@@ -73,6 +73,8 @@ class WhatAFindingHolds(Story):
     def test_what_an_option_leaves_out_is_still_missing_in_the_table(self):
         self.open('only')
         self.assertEqual('1 missing instance not shown (--only ~)', self.find('.not-shown').text)
+        self.assertIn('1 of 2 other inventories differ in these', self.find('#counts').text)
+        self.assertEqual(2, self.find('#counts').text.count('differ in these'))
         self.assertIn('Options narrowed what was compared: --class INV_Service', self.find('#rules-text').text)
         self.open_line('INV_Service.Started')
         self.assertEqual(['TRUE: a', 'FALSE: b', 'missing: c'], self.table())

@@ -12,6 +12,7 @@ function drawHead(overview) {
     const { counts } = overview;
     const isPair = overview.inventories.length === 2;
     document.documentElement.classList.toggle("pair", isPair);
+    const differ = overview.notShown ? "differ in these" : "differ";
     const [reference, other] = overview.inventories.map((inventory) => inventory.label);
     const lines = [
         ["minus", "−", counts.onlyInReference, isPair ? `only in ${reference}` : `in ${reference}, missing elsewhere`],
@@ -23,14 +24,14 @@ function drawHead(overview) {
             element("strong", {}, formatted(count)), ` ${text}`));
     }
     byId("counts").append(element("li", {}, element("strong", {}, formatted(overview.classes.length)),
-        ` of ${counted(overview.comparedClasses, "class", "classes")} differ`));
+        ` of ${counted(overview.comparedClasses, "class", "classes")} ${differ}`));
     if (overview.notShown) {
         byId("counts").append(element("li", { class: "not-shown" }, overview.notShown));
     }
     const differing = overview.inventories.filter((inventory, i) => i !== overview.reference && inventory.differences > 0).length;
     if (!isPair) {
         byId("counts").append(element("li", {}, element("strong", {}, formatted(differing)),
-            ` of ${counted(overview.inventories.length - 1, "other inventory", "other inventories")} differ`));
+            ` of ${counted(overview.inventories.length - 1, "other inventory", "other inventories")} ${differ}`));
     }
 }
 
