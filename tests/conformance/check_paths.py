@@ -1,7 +1,7 @@
 """Fails if a document names a file, folder, type or heading that does not exist, or a function that the named file does not hold.
 
-Argument: ROOT. Looked at are words in backticks that begin with a top-level folder, are the name of a source or of a type, and the word
-in backticks that follows a path after a comma; and links between documents. A name with Xxx in it stands for many.
+Argument: ROOT. The script checks words in backticks that begin with a top-level folder or are the name of a source or a type, the word
+in backticks that follows a path and a comma, and links between documents. A name with Xxx in it stands for many.
 """
 
 import pathlib
@@ -13,6 +13,7 @@ WORD = re.compile(r"`([^`\s]+)`")
 SOURCE = re.compile(r"[A-Z]\w*\.(?:h|cpp)")
 TYPE = re.compile(r"[TI][A-Z][a-z]\w+")
 LINK = re.compile(r"\]\(([^)#\s]*)(?:#([^)\s]*))?[^)]*\)")
+FENCED = re.compile(r"^ *(```+).*?^ *\1", re.M | re.S)
 HEADING = re.compile(r"^#+ (.*)$", re.M)
 FUNCTION = re.compile(r"`([^`\s]+\.(?:h|cpp))`, `(\w+)`")
 
@@ -37,7 +38,7 @@ def sources(root, folders):
 
 def anchors(document):
     """What a link may have behind #, as the pages of the forge name headings."""
-    headings = HEADING.findall(document.read_text(encoding="utf-8"))
+    headings = HEADING.findall(FENCED.sub("", document.read_text(encoding="utf-8")))
     return {re.sub(r"[^\w -]", "", heading.strip().lower()).replace(" ", "-") for heading in headings}
 
 
