@@ -45,8 +45,6 @@ class TCimXmlReader : public IXmlSink {
     boost::shared_ptr<const TEmbeddedObject> TakeObject() noexcept;
     /// See TCimXmlPathReader::TakeMetUnsettled.
     bool TakeMetUnsettled() noexcept { return fPaths.TakeMetUnsettled(); }
-    /// For values that turn out to be embedded objects only when their class is declared.
-    TCimXmlObjectReader& GetObjects() noexcept { return fObjects; }
 
   private:
     using TTable = TCimXmlTable;

@@ -33,8 +33,6 @@ class CIMDELTA_INTERNAL_EXPORT TXmlReader : public IPlaceSource {
     TXmlReader& operator=(const TXmlReader&) = delete;
     ~TXmlReader() override;
 
-    EParser GetParser() const noexcept { return fParser; }
-
     /// From the next Reset on, a document with a document type declaration is in error, so it cannot declare entities.
     void RefuseDocumentTypes() noexcept;
 

@@ -128,6 +128,12 @@ std::string UnlessZero(const std::string& address)
     return address == "0.0.0.0" || address == "::" ? std::string() : address;
 }
 
+// The table of IPv6 ends with a route that refuses everything and is no setting. Routes that refuse are not "up" there.
+bool IsSet(std::uint64_t flags, std::uint64_t metric)
+{
+    return (flags & kRouteRefuses) != 0 ? metric != UINT32_MAX : (flags & kRouteIsUp) != 0;
+}
+
 }  // namespace
 
 std::vector<TRoute> ReadRoutes4(std::string_view text, TReadFaults& faults)
@@ -150,16 +156,6 @@ std::vector<TRoute> ReadRoutes4(std::string_view text, TReadFaults& faults)
     }
     return routes;
 }
-
-namespace {
-
-// The table of IPv6 ends with a route that refuses everything and is no setting. Routes that refuse are not "up" there.
-bool IsSet(std::uint64_t flags, std::uint64_t metric)
-{
-    return (flags & kRouteRefuses) != 0 ? metric != UINT32_MAX : (flags & kRouteIsUp) != 0;
-}
-
-}  // namespace
 
 std::vector<TRoute> ReadRoutes6(std::string_view text, TReadFaults& faults)
 {
