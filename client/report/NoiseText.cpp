@@ -143,8 +143,7 @@ std::string WriteNoiseText(const TNoise& noise, const TTextOptions& options)
     text += (rows.empty() ? "" : "\n") + Table(rows);
     if (std::any_of(noise.rules.begin(), noise.rules.end(), [](const TNoiseRule& rule) { return !rule.isForTree; })) {
         text += "The options reach the classes below a class as well, also where a rule is for the class alone; the rules that "
-                "--save-rules "
-                "writes do not.\n";
+                "--save-rules writes do not.\n";
     }
     rows.clear();
     for (const TUnexplained& rest : noise.rest) {

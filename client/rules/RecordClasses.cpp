@@ -15,8 +15,7 @@ std::string DescribeRecordKeys(const std::string& className)
 {
     return "rules for class " + className +
            " cannot have excludekeys, because the comparison keeps its own records in a class of that name; leave out excludekeys, "
-           "or "
-           "make both results with -o ndjson and compare those with diff";
+           "or make both results with -o ndjson and compare those with diff";
 }
 
 }  // namespace NORVZEL20

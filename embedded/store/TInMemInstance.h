@@ -17,8 +17,8 @@ class TInMemClass;
 /// An instance in memory: one block with the shared pointer's counts, the instance and its properties.
 ///
 /// TInMemClass::AllocateInMemInstance makes it. A property that the class gets later is made when it is first asked for, and so are
-/// those beyond the first TInMemProperty::kMostBehindInstance. Handles
-/// stay valid when the instance is deleted and when the namespace goes; AddToNamespace then throws kNamespaceGone (18).
+/// those beyond the first TInMemProperty::kMostBehindInstance. Handles stay valid when the instance is deleted and when the
+/// namespace goes; AddToNamespace then throws kNamespaceGone (18).
 /// Threads: as the namespace, reading included.
 class CIMDELTA_EXPORT TInMemInstance final : public ICIMInstance, public boost::enable_shared_from_this<TInMemInstance> {
   public:
