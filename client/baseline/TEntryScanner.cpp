@@ -95,21 +95,27 @@ std::string TEntryScanner::GetReason() const
 
 void TEntryScanner::Refuse(const std::string& expected) const
 {
-    RefuseFound(fBegin, fField, expected);
+    RefuseFound(fBegin, fField.empty() ? WordAt(fBegin) : fField, expected);
 }
 
 void TEntryScanner::RefuseAt(std::size_t offset, const std::string& expected) const
 {
     const std::string_view rest = GetRest();
     const std::size_t begin = std::min(rest.find_first_not_of(kBlanks, offset), rest.size());
-    const std::string_view found = rest.substr(begin);
-    RefuseFound(fBegin + begin, std::string(found.substr(0, found.find_first_of(kBlanks))), expected);
+    RefuseFound(fBegin + begin, WordAt(fBegin + begin), expected);
+}
+
+// Empty at the end and at the # of a reason, which has a blank in front.
+std::string TEntryScanner::WordAt(std::size_t position) const
+{
+    const std::string_view rest = fText.substr(position);
+    const bool isReason = rest.substr(0, 1) == "#" && fText.substr(0, position).find_last_of(kBlanks) + 1 == position;
+    return isReason ? std::string() : std::string(rest.substr(0, rest.find_first_of(kBlanks)));
 }
 
 void TEntryScanner::RefuseFound(std::size_t position, const std::string& field, const std::string& expected) const
 {
-    const bool isEnd = field.empty() || field.front() == '#';
-    const std::string found = isEnd ? "the end of the entry" : EscapeForDisplay(CutText(field, kMostShown));
+    const std::string found = field.empty() ? "the end of the entry" : EscapeForDisplay(CutText(field, kMostShown));
     RefusePlace(position, "found " + found + ", expected " + expected);
 }
 

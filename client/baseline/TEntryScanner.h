@@ -39,6 +39,7 @@ class TEntryScanner {
   private:
     void Advance();
     void CheckQuotes(std::size_t begin, std::size_t end, std::size_t open) const;
+    std::string WordAt(std::size_t position) const;
     [[noreturn]] void RefuseFound(std::size_t position, const std::string& field, const std::string& expected) const;
     [[noreturn]] void RefusePlace(std::size_t position, const std::string& what) const;
 
