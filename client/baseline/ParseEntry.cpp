@@ -6,7 +6,8 @@
 //
 // and may end with "# REASON". INSTANCE is a class and a key as in a path; VALUE is what ValueIdentity writes. If the rules exclude
 // keys, several instances of an inventory may share one: then "(instances): 2" stands among the values of +, and " x2" behind a
-// VALUE that so many of them have. Different values have " / " between them. TakeValue.cpp shows what a VALUE is.
+// VALUE of other inventories that so many of them have. Different values have " / " between them. TakeValue.cpp shows what a VALUE
+// is.
 #include "client/baseline/ParseEntry.h"
 
 #include <algorithm>
@@ -14,11 +15,14 @@
 #include <utility>
 
 #include "client/baseline/EntryText.h"
+#include "client/baseline/FindEndOfQuoted.h"
 #include "client/baseline/ForEachUnquoted.h"
+#include "client/baseline/KeysOfInstance.h"
 #include "client/baseline/TDifferenceStates.h"
 #include "client/baseline/TEntryScanner.h"
 #include "client/baseline/TakeValue.h"
 #include "embedded/value/TNameText.h"
+#include "embedded/value/TValueText.h"
 
 namespace NORVZEL20 {
 
@@ -33,6 +37,17 @@ bool IsName(std::string_view text)
         const auto byte = static_cast<unsigned char>(character);
         return byte >= 0x80 || std::isalnum(byte) != 0 || character == '_';
     });
+}
+
+// Whether it is what a path can have as the value of a key.
+bool IsKeyValue(std::string_view value)
+{
+    using TType = TCIMValue::TCIMType;
+    if (!value.empty() && (value.front() == '"' || value.front() == '\'')) {
+        return FindEndOfQuoted(value, 0) + 1 == value.size();
+    }
+    TCIMValue read;
+    return value == "NULL" || TValueText::Parse(TType::kBoolean, value, read) || TValueText::Parse(TType::kReal64, value, read);
 }
 
 // Reads one entry.
@@ -74,13 +89,25 @@ class TEntryParser {
         if (field == "in" || (field != FieldText("in") && !IsName(field.substr(0, field.find('.'))))) {
             fScanner.Refuse("an instance, such as Disk.Id=\"sda\"");
         }
+        CheckKeys(field);
         return fScanner.Take();
     }
 
-    std::string Property()
+    void CheckKeys(const std::string& instance) const
+    {
+        for (const TKeyText& key : KeysOfInstance(instance)) {
+            if (!IsName(key.name) || !IsKeyValue(key.value)) {
+                fScanner.RefuseAt(key.position, "a key and its value, such as Id=\"sda\" or Bus=1");
+            }
+        }
+    }
+
+    // A number of instances stands in the place of a property only in an instance that the reference lacks.
+    std::string Property(TDifference::EKind kind)
     {
         std::string property = fScanner.Peek().substr(0, fScanner.Peek().find(':'));
-        if (fScanner.Peek() != property + ":" || (property != kInstancesMark && !IsName(property))) {
+        const bool isCount = kind == TDifference::kOnlyInOthers && property == kInstancesMark;
+        if (fScanner.Peek() != property + ":" || (!isCount && !IsName(property))) {
             fScanner.Refuse("a property with a colon behind it, such as Size:");
         }
         fScanner.Take();
@@ -106,7 +133,7 @@ class TEntryParser {
 
     TAcceptedDifference::TValue Change()
     {
-        TAcceptedDifference::TValue change{Property(), TakeValue(fScanner), std::string()};
+        TAcceptedDifference::TValue change{Property(TDifference::kChanged), TakeSingleValue(fScanner), std::string()};
         Expect("->", "\"->\" and the value of other inventories");
         change.after = TakeValue(fScanner);
         return change;
@@ -121,7 +148,7 @@ class TEntryParser {
             if (contents.count(fScanner.Peek().substr(0, fScanner.Peek().find(':'))) > 0) {
                 fScanner.Refuse("each property once; remove one of them");
             }
-            const std::string property = Property();
+            const std::string property = Property(kind);
             contents[property] = property == kInstancesMark ? TakeCount(fScanner) : TakeValue(fScanner);
             isMore = TakesComma();
         }

@@ -2,9 +2,8 @@
 
 #include <algorithm>
 #include <iterator>
-#include <string_view>
 
-#include "client/baseline/ForEachUnquoted.h"
+#include "client/baseline/KeysOfInstance.h"
 #include "embedded/value/TNameText.h"
 
 namespace NORVZEL20 {
@@ -23,21 +22,11 @@ std::string ClassOf(const TAcceptedDifference& entry)
     return entry.instance.substr(0, entry.instance.find('.'));
 }
 
-// Of Disk.Id="sda",Bus=1: Id and Bus.
 TNames KeyNamesOf(const std::string& instance)
 {
     TNames names;
-    std::size_t begin = instance.find('.');
-    while (begin < instance.size()) {
-        ++begin;
-        names.insert(instance.substr(begin, instance.find('=', begin) - begin));
-        std::size_t end = std::string::npos;
-        const std::string_view rest = std::string_view(instance).substr(begin);
-        ForEachUnquoted(rest, [&](std::size_t at) {
-            end = rest[at] == ',' ? begin + at : end;
-            return end == std::string::npos;
-        });
-        begin = end;
+    for (const TKeyText& key : KeysOfInstance(instance)) {
+        names.emplace(key.name);
     }
     return names;
 }

@@ -6,14 +6,16 @@
 //   datetime "..."    reference "..."    char16 'x'    embedded object "..."
 //   string[] {"a", NULL}                   an array of any of the types
 //
-// and may have " x2" behind it, if that many instances have it. The type is checked, and what can be read of a type is read and
+// and may have " x2" behind it, if two or more instances have it. The type is checked, and what can be read of a type is read and
 // written again, so an edited file may have other blanks and other spellings of a number than the program.
 #include "client/baseline/TakeValue.h"
 
 #include <algorithm>
+#include <optional>
 #include <string_view>
 
 #include "client/text/DisplayText.h"
+#include "client/text/NumberIn.h"
 #include "embedded/value/TValueText.h"
 
 namespace NORVZEL20 {
@@ -24,6 +26,13 @@ using TType = TCIMValue::TCIMType;
 
 constexpr char kValueExpected[] = "a value, such as \"text\", uint16 5 or NULL";
 constexpr char kDigits[] = "0123456789";
+
+// A number of instances as the program writes it; empty if it is none, or is less than two.
+std::string CountText(std::string_view text)
+{
+    const std::optional<std::uint64_t> count = NumberIn(text);
+    return count && *count > 1 ? std::to_string(*count) : std::string();
+}
 
 class TValueTaker {
   public:
@@ -37,6 +46,28 @@ class TValueTaker {
             text += kBetweenValues + TakeCounted();
         }
         return text;
+    }
+
+    // Without a number of instances.
+    std::string TakeSingle()
+    {
+        if (NextIs('"')) {
+            return TakeQuoted('"');
+        }
+        const std::size_t begin = fAt;
+        std::string type = TakeWord();
+        if (type == "NULL") {
+            return type;
+        }
+        const bool isEmbedded = type == "embedded" && TakeWord() == "object";
+        type = isEmbedded ? "embedded object" : type;
+        const TType element = isEmbedded ? TType(TType::kString) : TValueText::FindType(type);
+        const bool isArray = fRest.substr(fAt, 2) == "[]";
+        if (element == TType::kNone || (element == TType::kString && !isArray && !isEmbedded)) {
+            Refuse(begin, kValueExpected);
+        }
+        fAt += isArray ? 2 : 0;
+        return type + (isArray ? "[] " + TakeElements(element) : " " + TakeElement(element));
     }
 
     /// The characters that were taken.
@@ -67,34 +98,13 @@ class TValueTaker {
         std::string text = TakeSingle();
         if (NextIs('x')) {
             const std::size_t begin = fAt;
-            const std::string count = TakeWord();
-            if (count.size() < 2 || count.find_first_not_of(kDigits, 1) != std::string::npos) {
+            const std::string count = CountText(TakeWord().substr(1));
+            if (count.empty()) {
                 Refuse(begin, "the number of instances that have the value, such as x2");
             }
-            text += " " + count;
+            text += " x" + count;
         }
         return text;
-    }
-
-    std::string TakeSingle()
-    {
-        if (NextIs('"')) {
-            return TakeQuoted('"');
-        }
-        const std::size_t begin = fAt;
-        std::string type = TakeWord();
-        if (type == "NULL") {
-            return type;
-        }
-        const bool isEmbedded = type == "embedded" && TakeWord() == "object";
-        type = isEmbedded ? "embedded object" : type;
-        const TType element = isEmbedded ? TType(TType::kString) : TValueText::FindType(type);
-        const bool isArray = fRest.substr(fAt, 2) == "[]";
-        if (element == TType::kNone || (element == TType::kString && !isArray && !isEmbedded)) {
-            Refuse(begin, kValueExpected);
-        }
-        fAt += isArray ? 2 : 0;
-        return type + (isArray ? "[] " + TakeElements(element) : " " + TakeElement(element));
     }
 
     std::string TakeElements(TType type)
@@ -128,13 +138,14 @@ class TValueTaker {
 
     std::string TakeElement(TType type)
     {
-        if (type == TType::kString || type == TType::kDateTime || type == TType::kReference || type == TType::kChar16) {
+        if (type == TType::kString || type == TType::kReference || type == TType::kChar16) {
             return TakeQuoted(type == TType::kChar16 ? '\'' : '"');
         }
         SkipBlanks();
         const std::size_t begin = fAt;
+        const std::string word = type == TType::kDateTime ? TakeQuoted('"') : TakeWord();
         TCIMValue value;
-        if (!TValueText::Parse(type, TakeWord(), value)) {
+        if (!TValueText::Parse(type, type == TType::kDateTime ? std::string_view(word).substr(1, word.size() - 2) : word, value)) {
             Refuse(begin, std::string("a value of type ") + TValueText::GetTypeName(type));
         }
         std::string text;
@@ -167,14 +178,22 @@ std::string TakeValue(TEntryScanner& scanner)
     return text;
 }
 
+std::string TakeSingleValue(TEntryScanner& scanner)
+{
+    TValueTaker taker(scanner);
+    std::string text = taker.TakeSingle();
+    scanner.Skip(taker.GetLength());
+    return text;
+}
+
 std::string TakeCount(TEntryScanner& scanner)
 {
     const std::string_view rest = scanner.GetRest();
     const std::size_t length = std::min(rest.find_first_not_of(kDigits), rest.size());
-    if (length == 0) {
-        scanner.Refuse("a number of instances");
+    std::string count = CountText(rest.substr(0, length));
+    if (count.empty()) {
+        scanner.Refuse("a number of instances, two or more");
     }
-    const std::string count(rest.substr(0, length));
     scanner.Skip(length);
     return count;
 }

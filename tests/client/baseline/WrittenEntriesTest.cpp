@@ -167,7 +167,7 @@ TAcceptedDifference MakeEntry(TMaker& maker)
         return maker.Below(4) == 0 ? text + " x2 / " + ValueIdentity(maker.Any(), false) : text;
     };
     if (entry.kind == TDifference::kChanged) {
-        entry.values.push_back({"P", value(), value()});
+        entry.values.push_back({"P", ValueIdentity(maker.Any(), maker.Below(2) == 0), value()});
     } else if (entry.kind == TDifference::kOnlyInOthers) {
         for (const char* const property : {"(instances)", "A", "in"}) {
             if (maker.Below(2) == 0) {
