@@ -15,12 +15,12 @@ struct TBaselineOptions {
     std::string reason;    ///< why they are accepted
 };
 
-/// A reason is the end of a line of the file. Errors: TClientError if it is not one line of text in UTF-8.
+/// Refuses a reason that cannot be the end of a line of the file. Errors: TClientError if it is not one line of text in UTF-8.
 void CheckReason(const std::string& reason);
 
 /// Makes the report one of what `baseline` does not accept. If `options` name a file to accept, returns the baseline that accepts
 /// everything in the run, with `reason` for what is new. The report must stay where it is while its differences are read.
-/// Errors: those of IDifferences::ForEach.
+/// Errors: those of IDifferences::ForEach and of TRules.
 std::optional<TBaseline> ApplyBaseline(TComparisonReport& report, TBaseline baseline, const TBaselineOptions& options);
 
 }  // namespace NORVZEL20

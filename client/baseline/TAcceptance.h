@@ -18,9 +18,9 @@ class TAcceptance {
   public:
     struct TVerdict {
         bool isAccepted = false;
-        std::optional<std::size_t> entry;                  ///< for that inventory, whatever its values
-        std::vector<TAcceptedDifference::TValue> present;  ///< if there is an entry: what the inventory has, and otherwise what the
-                                                           ///< entry says of properties that were not compared
+        std::optional<std::size_t> entry;  ///< for that inventory, whatever its values
+        /// If there is an entry: what the inventory has, and besides what the entry says of properties that were not compared.
+        std::vector<TAcceptedDifference::TValue> present;
     };
 
     /// The report must outlive this.

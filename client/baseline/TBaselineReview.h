@@ -17,7 +17,7 @@ namespace NORVZEL20 {
 class TBaselineReview {
   public:
     /// Reads `all` once. `acceptance` must outlive this. Only if `isAccepting`, what is there is kept for Accept.
-    /// Errors: those of IDifferences::ForEach.
+    /// Errors: those of IDifferences::ForEach and of TRules.
     TBaselineReview(IDifferences& all, const TAcceptance& acceptance, bool isAccepting);
 
     /// The counts of what the baseline does not accept.

@@ -13,8 +13,9 @@ struct TBaselineOutcome {
     /// An accepted difference that is another one now.
     struct TChanged {
         TAcceptedDifference accepted;
-        TAcceptedDifference
-            present;  ///< the same inventories; of kOnlyInOthers all values, those that were not compared as accepted
+        /// For the same inventories. Of kOnlyInOthers all values, and besides the accepted ones of properties that were not
+        /// compared.
+        TAcceptedDifference present;
     };
 
     std::string file;
