@@ -12,14 +12,14 @@ void TUnacceptedDifferences::ForEach(const TCallback& callback)
     TPropertyOrder order(fAcceptance->GetReference());
     std::size_t position = 0;
     fAll->ForEach([&](const TDifference& difference) {
-        switch (fShares[position++]) {
+        switch (fShares.at(position++)) {
         case EUnaccepted::kAll:
             callback(difference);
             break;
         case EUnaccepted::kSome:
             callback(ReduceDifference(difference, FindUnaccepted(difference), order));
             break;
-        default:
+        case EUnaccepted::kNone:
             break;
         }
     });

@@ -15,7 +15,7 @@ namespace NORVZEL20 {
 /// Threads: one at a time.
 class TUnacceptedDifferences final : public IDifferences {
   public:
-    /// `shares` and `counts` are what TBaselineReview found in `all`.
+    /// `shares`, one for each difference, and `counts` are what TBaselineReview found in `all`.
     TUnacceptedDifferences(std::shared_ptr<IDifferences> all, std::shared_ptr<const TAcceptance> acceptance,
                            std::vector<EUnaccepted> shares, const TDifferenceCounts& counts)
         : fAll(std::move(all)), fAcceptance(std::move(acceptance)), fShares(std::move(shares)), fCounts(counts)
@@ -23,6 +23,7 @@ class TUnacceptedDifferences final : public IDifferences {
 
     TDifferenceCounts GetCounts() const override { return fCounts; }
     /// Cost, beside that of the differences: the texts of the values of those that are accepted for some inventories.
+    /// Errors: also those of TRules; std::out_of_range if there are more differences than `shares`.
     void ForEach(const TCallback& callback) override;
 
   private:
