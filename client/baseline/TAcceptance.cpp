@@ -65,21 +65,27 @@ bool TAcceptance::IsCompared(const TAcceptedDifference& entry) const
 }
 
 // Whether the entry names the keys by which some inventory of the run knows instances. It does not if the rules excluded other keys
-// when it was accepted.
+// when it was accepted. The reference must declare the class. An entry of an instance that only the reference has names all keys,
+// also those that the rules exclude, as TDifferenceStates::GetInstance says.
 bool TAcceptance::IsKeyed(const TAcceptedDifference& entry) const
 {
     const std::string className = ClassOf(entry);
+    const boost::shared_ptr<TInMemClass> declared = GetReference().ns->FindClass(className);
     const TNames named = KeyNamesOf(entry.instance);
+    const bool hasAll = entry.kind == TDifference::kOnlyInReference;
     return std::any_of(fReport.inventories->begin(), fReport.inventories->end(), [&](const TInventory& inventory) {
         const boost::shared_ptr<TInMemClass> cls = inventory.ns->FindClass(className);
+        if (!cls) {
+            return false;
+        }
         TNames names;
-        for (const std::uint32_t slot : cls ? cls->GetLayout().GetKeys() : std::vector<std::uint32_t>()) {
+        for (const std::uint32_t slot : cls->GetLayout().GetKeys()) {
             const std::string key = cls->GetLayout().GetDecl(slot).GetName();
-            if (entry.kind == TDifference::kOnlyInReference || !fReport.meaning->ExcludesKey(className, key)) {
+            if (hasAll || !fReport.meaning->ExcludesKey(declared->GetName(), key)) {
                 names.insert(key);
             }
         }
-        return cls && std::equal(names.begin(), names.end(), named.begin(), named.end(), &TNameText::Equal);
+        return std::equal(names.begin(), names.end(), named.begin(), named.end(), &TNameText::Equal);
     });
 }
 

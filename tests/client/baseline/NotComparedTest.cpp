@@ -105,6 +105,16 @@ TEST_F(NotComparedTest, WhatWasAcceptedByOtherKeysIsNotGone)
     EXPECT_NE(std::string::npos, Since().find("3 accepted differences.\n")) << fReport;
 }
 
+TEST_F(NotComparedTest, WithExcludedKeysNamesMayBeInAnyLetterCase)
+{
+    const std::string disks = Class("Disk", "", KeyProperty("Id") + KeyProperty("Bus") + Declaration("Size", "uint16")) +
+                              Instance("Disk", Value("Id", "sda") + Value("Bus", "1") + Value("Size", "1", "uint16"));
+    SystemWith("web01", disks);
+    SystemWith("web02", disks);
+    WriteEntries("~ DISK.ID=\"sda\" SIZE: uint16 1 -> uint16 2 in web02\n- DISK.BUS=\"2\",ID=\"sda\" in web02\n");
+    EXPECT_NE(std::string::npos, Since({"--exclude-key", "Bus"}).find("\nCompared with base.txt: 2 gone; 0 accepted\n")) << fReport;
+}
+
 TEST_F(NotComparedTest, EntriesForTheReferenceAreSaidToBeThat)
 {
     System("web02", {{"sda", "2"}, {"sdb", "5"}});
