@@ -205,8 +205,8 @@ class TSelector {
             }
         }
         const auto& [position, names] = *members.begin();
-        throw TClientError(typed.Show() + ": is not compared without the option either; cimdelta explain " + fBefore[position].name + "." +
-                           *names.begin() + " says why");
+        throw TClientError(typed.Show() + ": is not compared without the option either; cimdelta explain " +
+                           fBefore[position].name + "." + *names.begin() + " says why");
     }
 
     TRulesDraft& fDraft;
