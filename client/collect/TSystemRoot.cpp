@@ -59,6 +59,13 @@ TFolderEntry::EKind KindOf(const dirent& entry, int folder)
     }
 }
 
+// At the end of the folder errno is 0, after an error it is not.
+const dirent* NextEntry(DIR* folder)
+{
+    errno = 0;
+    return readdir(folder);
+}
+
 bool IsOwnOrParent(const std::string& name)
 {
     return name == "." || name == "..";
@@ -169,7 +176,7 @@ std::vector<TFolderEntry> TSystemRoot::List(const std::string& path, std::string
         return entries;
     }
     const int number = descriptor.Release();  // the folder closes it
-    while (const dirent* entry = readdir(folder.get())) {
+    while (const dirent* entry = NextEntry(folder.get())) {
         if (entries.size() == kMostEntries) {
             trouble = "it has more than " + std::to_string(kMostEntries) + " names";
             return {};
@@ -177,6 +184,10 @@ std::vector<TFolderEntry> TSystemRoot::List(const std::string& path, std::string
         if (!IsOwnOrParent(entry->d_name)) {
             entries.push_back({entry->d_name, KindOf(*entry, number)});
         }
+    }
+    if (errno != 0) {
+        trouble = TroubleOf(errno);
+        return {};
     }
     std::sort(entries.begin(), entries.end(), [](const TFolderEntry& a, const TFolderEntry& b) { return a.name < b.name; });
     return entries;

@@ -1,4 +1,5 @@
-// Files that change while they are read: the program's own calls of read() go through this file, which changes them.
+// Files that change while they are read: the program's own calls of read() and readdir() go through this file, which changes them.
+#include <dirent.h>
 #include <gtest/gtest.h>
 #include <unistd.h>
 
@@ -11,20 +12,27 @@ namespace {
 // Is called with each descriptor before it is read; returns the error that reading is to give, or 0.
 std::function<int(int)> fgBeforeRead;
 
+bool IsRefused(int descriptor)
+{
+    const int error = fgBeforeRead ? fgBeforeRead(descriptor) : 0;
+    errno = error == 0 ? errno : error;
+    return error != 0;
+}
+
 }  // namespace
 
 extern "C" ssize_t __real_read(int descriptor, void* buffer, size_t size);
 
 extern "C" ssize_t __wrap_read(int descriptor, void* buffer, size_t size)
 {
-    if (fgBeforeRead) {
-        const int error = fgBeforeRead(descriptor);
-        if (error != 0) {
-            errno = error;
-            return -1;
-        }
-    }
-    return __real_read(descriptor, buffer, size);
+    return IsRefused(descriptor) ? -1 : __real_read(descriptor, buffer, size);
+}
+
+extern "C" dirent* __real_readdir(DIR* folder);
+
+extern "C" dirent* __wrap_readdir(DIR* folder)
+{
+    return IsRefused(dirfd(folder)) ? nullptr : __real_readdir(folder);
 }
 
 namespace NORVZEL20 {
@@ -94,6 +102,13 @@ TEST_F(ChangingFilesTest, FileThatCannotBeReadIsLeftOut)
 {
     BeforeReading("/etc/ssh/sshd_config", [](int) { return EIO; });
     EXPECT_EQ("/etc/ssh/sshd_config: Input/output error; /etc/shadow: it may hold keys or passwords", FilesLine());
+}
+
+TEST_F(ChangingFilesTest, FolderThatCannotBeReadToItsEndIsLeftOut)
+{
+    BeforeReading("/etc/ssh", [](int reads) { return reads < 3 ? 0 : EIO; });
+    EXPECT_EQ("/etc/ssh: Input/output error; /etc/shadow: it may hold keys or passwords", FilesLine());
+    EXPECT_EQ(std::string::npos, Show("KALMO_ConfigurationFile").find("sshd_config"));
 }
 
 TEST_F(ChangingFilesTest, InterruptedReadsGoOn)
