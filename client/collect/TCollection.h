@@ -65,7 +65,8 @@ class TCollection {
     /// Reads a file and writes what the reader makes of it.
     void AddFrom(const std::string& path, TReader reader);
 
-    /// The units' files, read when they are asked for first. Errors: TTimeIsUp.
+    /// The units' files, read when they are asked for first. What of them cannot be read is left out once, and belongs to the kind
+    /// that asks first. Errors: TTimeIsUp.
     const TUnitFiles& GetUnitFiles();
 
     /// Errors: TTimeIsUp.

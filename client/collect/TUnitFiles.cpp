@@ -92,8 +92,7 @@ TUnitFiles::TUnitFiles(TCollection& collection) : fCollection(collection)
 
 void TUnitFiles::TakeFolder(const std::string& folder)
 {
-    std::string trouble;
-    for (const TFolderEntry& entry : fCollection.GetRoot().List(folder, trouble)) {
+    for (const TFolderEntry& entry : EntriesOf(folder)) {
         const bool isFolder = entry.kind == TFolderEntry::EKind::kFolder;
         if (isFolder && (EndsWith(entry.name, ".wants") || EndsWith(entry.name, ".requires") || EndsWith(entry.name, ".upholds"))) {
             TakeEnabled(folder, entry.name);
@@ -103,9 +102,16 @@ void TUnitFiles::TakeFolder(const std::string& folder)
             TakeUnit(folder, entry);
         }
     }
+}
+
+std::vector<TFolderEntry> TUnitFiles::EntriesOf(const std::string& folder)
+{
+    std::string trouble;
+    std::vector<TFolderEntry> entries = fCollection.GetRoot().List(folder, trouble);
     if (!trouble.empty()) {
         fCollection.LeaveOut(folder, trouble);
     }
+    return entries;
 }
 
 void TUnitFiles::TakeUnit(const std::string& folder, const TFolderEntry& entry)
@@ -167,7 +173,7 @@ void TUnitFiles::TakeEnabled(const std::string& folder, const std::string& subfo
     if (!IsForSettings(folder)) {
         return;
     }
-    for (const TFolderEntry& entry : fCollection.GetRoot().List(folder + "/" + subfolder)) {
+    for (const TFolderEntry& entry : EntriesOf(folder + "/" + subfolder)) {
         if (IsUnitName(entry.name)) {
             fEnabled.emplace(entry.name, StateInFolder(folder, "enabled"));
             if (const std::string pattern = TemplateOf(entry.name); !pattern.empty()) {
@@ -180,7 +186,7 @@ void TUnitFiles::TakeEnabled(const std::string& folder, const std::string& subfo
 void TUnitFiles::TakeDropIns(const std::string& folder, const std::string& subfolder)
 {
     const std::string unit = subfolder.substr(0, subfolder.size() - 2);
-    for (const TFolderEntry& entry : fCollection.GetRoot().List(folder + "/" + subfolder)) {
+    for (const TFolderEntry& entry : EntriesOf(folder + "/" + subfolder)) {
         if (EndsWith(entry.name, ".conf")) {
             fDropIns[unit].emplace(entry.name, folder + "/" + subfolder + "/" + entry.name);
         }

@@ -2,6 +2,7 @@
 
 #include <map>
 #include <string>
+#include <vector>
 
 #include "client/collect/TCollection.h"
 #include "client/collect/TUnit.h"
@@ -11,7 +12,8 @@ namespace NORVZEL20 {
 /// The systemd units of a system that have a file: services, sockets, timers, paths, targets and automounts.
 class TUnitFiles {
   public:
-    /// Reads all files of units. One that cannot be read is left out of the collection. Errors: TCollection::TTimeIsUp.
+    /// Reads all files of units. A file or folder that cannot be read is left out of the collection. Errors:
+    /// TCollection::TTimeIsUp.
     explicit TUnitFiles(TCollection& collection);
 
     /// By name.
@@ -22,6 +24,8 @@ class TUnitFiles {
 
   private:
     void TakeFolder(const std::string& folder);
+    /// A folder that cannot be read is left out of the collection.
+    std::vector<TFolderEntry> EntriesOf(const std::string& folder);
     void TakeUnit(const std::string& folder, const TFolderEntry& entry);
     void TakeLink(const std::string& folder, const std::string& name, TUnit& unit);
     void TakeOtherName(const std::string& folder, const std::string& name, const std::string& target);

@@ -188,6 +188,11 @@ TEST_F(BadSystemsTest, FoldersWithTooManyFilesAreLeftOut)
     }
     EXPECT_EQ("/etc/ssh: it has more than 100000 names; /etc/shadow: it may hold keys or passwords\n", LinesAbout("files"));
     EXPECT_EQ("/etc/ssh: it has more than 100000 names\n", LinesAbout("certificates"));
+    for (const std::string folder : {"/etc/systemd/system/x.target.wants", "/etc/systemd/system/x.service.d"}) {
+        std::filesystem::rename(fSystem->Place("/etc/ssh"), fSystem->Place(folder));
+        EXPECT_EQ(folder + ": it has more than 100000 names\n", LinesAbout("units"));
+        std::filesystem::rename(fSystem->Place(folder), fSystem->Place("/etc/ssh"));
+    }
 }
 
 /// Values of the kernel that are missing, empty or cut are NULL.
