@@ -169,6 +169,8 @@ TEST_F(UnitsTest, TimersThatAreStartedAreJobs)
     Unit("/usr/lib/systemd/system/tidy.timer", "[Timer]\nOnCalendar=daily\nOnBootSec=5min\n");
     Unit("/usr/lib/systemd/system/off.timer", "[Timer]\nOnCalendar=daily\n[Install]\nWantedBy=timers.target\n");
     Unit("/usr/lib/systemd/system/x@.timer", "[Timer]\nOnCalendar=daily\n");
+    Unit("/opt/own/own.timer", "[Timer]\nOnCalendar=daily\n").Link("/etc/systemd/system/own.timer", "/opt/own/own.timer");
+    Unit("/opt/own/now.timer", "[Timer]\nOnCalendar=daily\n").Link("/run/systemd/system/now.timer", "/opt/own/now.timer");
     EXPECT_EQ("KALMO_ScheduledJob.Command=\"run-parts /etc/cron.hourly\",Source=\"/etc/crontab\",User=\"root\"\n"
               "    Source: /etc/crontab\n"
               "    Command: run-parts /etc/cron.hourly\n"
