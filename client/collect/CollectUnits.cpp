@@ -3,8 +3,9 @@
 // Without an answer of the service manager, a service is active if its control group has processes; nothing is known of other
 // units.
 //
-// Some services run for a moment whenever something else asks for them: a timer, a path, or a program that calls them by their bus
-// name. Whether one of them runs just now is chance, so it has no state unless it has failed.
+// Some services run for a moment whenever something else asks for them: a timer, a path, a socket, or a program that calls them by
+// their bus name. Whether one of them runs just now is chance, so it has no state unless it has failed. Many services that always
+// run have a socket or a bus name too; they can be enabled, or a target wants them.
 //
 // Units that programs make for a session or a command are left out: those with a file for the time of their run, and those without
 // a file that have such a name. A unit with a file of its own stays, whatever its name.
@@ -110,15 +111,29 @@ class TUnitStateSource {
     bool fKnowsServices = false;
 };
 
+// Whether neither a link nor a setting starts the unit with the system.
+bool IsStartedByOthersOnly(const TUnit& unit)
+{
+    return !unit.isWanted && (unit.state == "static" || (unit.state == "indirect" && !unit.file.isInstalled));
+}
+
 // The units that come and go as others ask for them.
 std::set<std::string> UnitsOnDemand(const std::map<std::string, TUnit>& units)
 {
     std::set<std::string> names;
+    std::set<std::string> called;  // by a socket or by bus name
     for (const auto& [name, unit] : units) {
         if (EndsWith(name, ".timer") || EndsWith(name, ".path")) {
             names.insert(unit.Activated(name));
+        } else if (EndsWith(name, ".socket")) {
+            called.insert(unit.Activated(name));
+        } else if (unit.file.type == "dbus" || (unit.file.type.empty() && unit.file.hasBusName)) {
+            called.insert(name);
         }
-        if (unit.file.type == "dbus" && unit.state == "static") {
+    }
+    for (const std::string& name : called) {
+        const auto unit = units.find(name);
+        if (unit != units.end() && IsStartedByOthersOnly(unit->second)) {
             names.insert(name);
         }
     }

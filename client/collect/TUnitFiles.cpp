@@ -170,11 +170,11 @@ void TUnitFiles::TakeText(const std::string& path, TUnit& unit)
 
 void TUnitFiles::TakeEnabled(const std::string& folder, const std::string& subfolder)
 {
-    if (!IsForSettings(folder)) {
-        return;
-    }
     for (const TFolderEntry& entry : EntriesOf(folder + "/" + subfolder)) {
-        if (IsUnitName(entry.name)) {
+        fWanted.insert(entry.name);
+        const std::string path = folder + "/" + subfolder + "/" + entry.name;
+        fWanted.insert(NameOf(fCollection.GetRoot().ReadLink(path).value_or(std::string())));
+        if (IsForSettings(folder) && IsUnitName(entry.name)) {
             fEnabled.emplace(entry.name, StateInFolder(folder, "enabled"));
             if (const std::string pattern = TemplateOf(entry.name); !pattern.empty()) {
                 TakeOtherName(folder, entry.name, pattern);
@@ -212,6 +212,7 @@ void TUnitFiles::FinishUnit(const std::string& name, TUnit& unit)
             ReadUnitFile(*text, unit.file);
         }
     }
+    unit.isWanted = fWanted.count(name) > 0;
     if (unit.state.empty()) {
         unit.state = StateByLinks(name, unit);
     }

@@ -1,6 +1,7 @@
 #pragma once
 
 #include <map>
+#include <set>
 #include <string>
 #include <vector>
 
@@ -39,6 +40,7 @@ class TUnitFiles {
     TCollection& fCollection;
     std::map<std::string, TUnit> fUnits;
     std::map<std::string, std::string> fEnabled;  // the state by the names that are linked
+    std::set<std::string> fWanted;                // names of such links in all folders, and of what they lead to
     // Links that lead to a unit by another name: name of the unit, name of the link, state.
     std::map<std::string, std::map<std::string, std::string>> fOtherNames;
     std::map<std::string, std::map<std::string, std::string>> fDropIns;  // unit, name of the file, path

@@ -47,7 +47,9 @@ void TakeUnitValue(std::string_view section, std::string_view name, std::string_
         unit.description = std::string(value);
     } else if (section == "[Service]" && name == "Type") {
         unit.type = std::string(value);
-    } else if ((section == "[Timer]" || section == "[Path]") && name == "Unit") {
+    } else if (section == "[Service]" && name == "BusName") {
+        unit.hasBusName = !value.empty();
+    } else if (((section == "[Timer]" || section == "[Path]") && name == "Unit") || (section == "[Socket]" && name == "Service")) {
         unit.activated = std::string(value);
     } else if (section == "[Timer]") {
         TakeTimerValue(name, value, unit);

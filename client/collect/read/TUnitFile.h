@@ -8,8 +8,9 @@ namespace NORVZEL20 {
 /// What the file of a systemd unit says, as far as an inventory needs it.
 struct TUnitFile {
     std::string description;
-    std::string type;                    ///< of a service: simple, oneshot, dbus ...
-    std::string activated;               ///< the unit that a timer or path starts, if the file names one
+    std::string type;         ///< of a service: simple, oneshot, dbus ...
+    bool hasBusName = false;  ///< of a service: it has a name on the bus; then the type is dbus unless the file says another
+    std::string activated;    ///< the unit that a timer, path or socket starts, if the file names one
     std::vector<std::string> schedules;  ///< of a timer: OnCalendar=daily
     std::vector<std::string> aliases;    ///< other names by which it may be enabled
     std::string defaultInstance;         ///< of a template: "tty1"

@@ -115,6 +115,44 @@ TEST_F(UnitsTest, UnitsOnDemandHaveAStateOnlyIfTheyFailed)
               States());
 }
 
+TEST_F(UnitsTest, ServicesOfSocketsAndCallsAreOnDemandUnlessSomethingWantsThem)
+{
+    const std::string lib = "/usr/lib/systemd/system/";
+    const std::string installed = "[Install]\nWantedBy=multi-user.target\n";
+    const std::string call = "[Service]\nBusName=org.example.Named\n";
+    Unit(lib + "a-fsckd.service", "[Service]\n").File(lib + "a-fsckd.socket", "[Socket]\n");
+    Unit(lib + "b-other.service", "[Service]\n").File(lib + "b.socket", "[Socket]\nService=b-other.service\n");
+    Unit(lib + "c-named.service", call).Link(lib + "dbus-org.example.Named.service", "c-named.service");
+    Unit(lib + "d-also.service", "[Install]\nAlso=d-also.socket\n").File(lib + "d-also.socket", "[Socket]\n");
+    Unit(lib + "k-simple.service", call + "Type=simple\n");
+    Unit(lib + "l-login.service", call).Link(lib + "multi-user.target.wants/l-login.service", "../l-login.service");
+    Unit(lib + "m-bus.service", call).Link(lib + "multi-user.target.wants/m-alias.service", "../m-bus.service");
+    Unit(lib + "n-journald.service", "[Service]\n")
+        .File(lib + "n-journald.socket", "[Socket]\n")
+        .Link(lib + "sysinit.target.wants/n-journald.service", "../n-journald.service");
+    Unit(lib + "o-print.service", installed).File(lib + "o-print.socket", "[Socket]\n");
+    for (const char* name : {"a-fsckd", "b-other", "c-named", "d-also", "k-simple", "l-login", "m-bus", "n-journald", "o-print"}) {
+        fSystem->fCalls.fUnits->push_back({name + std::string(".service"), "", "active", "running"});
+    }
+    EXPECT_EQ("a-fsckd.service static NULL\n"
+              "a-fsckd.socket static inactive\n"
+              "b-other.service static NULL\n"
+              "b.socket static inactive\n"
+              "c-named.service static NULL\n"
+              "d-also.service indirect NULL\n"
+              "d-also.socket static inactive\n"
+              "dbus-org.example.Named.service alias NULL\n"
+              "k-simple.service static active\n"
+              "l-login.service static active\n"
+              "m-bus.service static active\n"
+              "n-journald.service static active\n"
+              "n-journald.socket static inactive\n"
+              "o-print.service disabled active\n"
+              "o-print.socket static inactive\n"
+              "ssh.service enabled active\n",
+              States());
+}
+
 TEST_F(UnitsTest, UnitsWithoutAFileAreThoseThatAreLoaded)
 {
     fSystem->fCalls.fUnits->push_back({"made.service", "Made", "active", "running"});
