@@ -33,6 +33,8 @@ constexpr const char* kPassingUnits[] = {
     "systemd-coredump@*",
     "systemd-fsck@*",
     "systemd-backlight@*",
+    "blockdev@dev-*.target",
+    "modprobe@*.service",
     "*-*-*-*-*-*.service",
 };
 
@@ -41,6 +43,12 @@ using TUnitStates = std::map<std::string, TUnitState>;
 bool IsPassingUnit(const std::string& name)
 {
     return MatchesAny(name, kPassingUnits);
+}
+
+// Whether it serves one connection of a socket: echo@0-192.0.2.7:2222-192.0.2.9:33848.service of echo.socket.
+bool IsOfConnection(const std::string& name, const std::map<std::string, TUnit>& units)
+{
+    return fnmatch("*@[0-9]*-*-*.service", name.c_str(), 0) == 0 && units.count(name.substr(0, name.find('@')) + ".socket") > 0;
 }
 
 bool HasProcesses(const TCollection& collection, const std::string& group)
@@ -173,7 +181,8 @@ void CollectUnits(TCollection& collection)
         collection.Add(facts);
     }
     for (const auto& [name, state] : states.GetStates()) {
-        if (files.GetUnits().count(name) == 0 && TUnitFiles::IsUnitName(name) && !IsPassingUnit(name)) {
+        if (files.GetUnits().count(name) == 0 && TUnitFiles::IsUnitName(name) && !IsPassingUnit(name) &&
+            !IsOfConnection(name, files.GetUnits())) {
             TFacts facts("KALMO_Unit");
             facts.Key("Name", name).Text("Description", state.description);
             AddState(facts, state, false);

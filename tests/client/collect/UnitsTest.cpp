@@ -161,6 +161,22 @@ TEST_F(UnitsTest, UnitsWithoutAFileAreThoseThatAreLoaded)
     EXPECT_EQ("ssh.service enabled active\nmade.service NULL active\n", States());
 }
 
+TEST_F(UnitsTest, UnitsOfOneConnectionDeviceOrModuleAreLeftOut)
+{
+    Unit("/etc/systemd/system/echo.socket", "[Socket]\nAccept=yes\n");
+    Unit("/etc/systemd/system/echo@.service", "[Service]\n");
+    for (const char* name : {"echo@0-127.0.0.1:2222-127.0.0.1:33848.service", "echo@17-1234-0.service", "echo@made.service",
+                             "backup@2026-11-22.service", "blockdev@dev-vda.target", "modprobe@drm.service"}) {
+        fSystem->fCalls.fUnits->push_back({name, "", "active", "running"});
+    }
+    EXPECT_EQ("echo.socket static inactive\n"
+              "echo@.service static NULL\n"
+              "ssh.service enabled active\n"
+              "backup@2026-11-22.service NULL active\n"
+              "echo@made.service NULL active\n",
+              States());
+}
+
 TEST_F(UnitsTest, UnitsWithAFileStayWhateverTheirName)
 {
     Unit("/etc/systemd/system/run-backup.service", "[Service]\n");
