@@ -10,8 +10,9 @@
 //   /etc/systemd/system/cups.service -> /dev/null              cups.service is masked, as by an empty file
 //   /etc/systemd/system/ssh.service.d/port.conf                changes ssh.service
 //
-// Links in /run are enabled until the next start. A unit of which no link speaks is disabled if its file says how it could be
-// enabled, and static if not. An instance such as getty@tty1.service has the file of its template, getty@.service.
+// Links in /run, those of generators too, are enabled until the next start. A unit of which no link speaks is disabled if its file
+// says how it could be enabled, and static if not. An instance such as getty@tty1.service has the file of its template,
+// getty@.service.
 #include "client/collect/TUnitFiles.h"
 
 #include <algorithm>
@@ -44,7 +45,7 @@ std::string StateOfFolder(const std::string& folder)
 // In other folders, links come with packages.
 bool IsForSettings(const std::string& folder)
 {
-    return folder == "/etc/systemd/system" || folder == "/run/systemd/system";
+    return folder == "/etc/systemd/system" || StartsWith(folder, "/run/");
 }
 
 std::string FolderOf(const std::string& path)

@@ -93,6 +93,24 @@ TEST_F(UnitsTest, TemplatesAndLinkedFilesHaveTheStatesOfSystemd)
               States());
 }
 
+TEST_F(UnitsTest, LinksOfGeneratorsEnableUntilTheNextStart)
+{
+    const std::string lib = "/usr/lib/systemd/system/";
+    const std::string generated = "/run/systemd/generator/";
+    Unit(lib + "fsck-root.service", "[Service]\n")
+        .Link(generated + "local-fs.target.wants/fsck-root.service", lib + "fsck-root.service");
+    Unit(lib + "serial@.service", "[Install]\nWantedBy=getty.target\n")
+        .Link(generated + "getty.target.wants/serial@ttyS0.service", lib + "serial@.service");
+    Unit("/run/systemd/generator.late/old.service", "[Service]\n")
+        .Link("/run/systemd/generator.late/multi-user.target.wants/old.service", "../old.service");
+    EXPECT_EQ("fsck-root.service enabled-runtime inactive\n"
+              "old.service generated inactive\n"
+              "serial@.service indirect NULL\n"
+              "serial@ttyS0.service enabled-runtime inactive\n"
+              "ssh.service enabled active\n",
+              States());
+}
+
 TEST_F(UnitsTest, UnitWhoseFileCannotBeReadHasNoStateOfItsFile)
 {
     fSystem->Link("/etc/systemd/system/gone.service", "/opt/gone/gone.service");
