@@ -118,7 +118,8 @@ std::vector<TFolderEntry> TUnitFiles::EntriesOf(const std::string& folder)
 void TUnitFiles::TakeUnit(const std::string& folder, const TFolderEntry& entry)
 {
     fCollection.CheckTime();
-    if (fUnits.count(entry.name) > 0) {
+    if (const auto hiding = fUnits.find(entry.name); hiding != fUnits.end()) {
+        TakeHidden(folder + "/" + entry.name, hiding->second);
         return;
     }
     TUnit unit;
@@ -130,6 +131,17 @@ void TUnitFiles::TakeUnit(const std::string& folder, const TFolderEntry& entry)
         TakeText(unit.path, unit);
     }
     fUnits.emplace(entry.name, std::move(unit));
+}
+
+// A masked unit is described by the file that the mask hides.
+void TUnitFiles::TakeHidden(const std::string& path, TUnit& unit)
+{
+    if (!StartsWith(unit.state, "masked") || !unit.file.description.empty()) {
+        return;
+    }
+    TUnitFile hidden;
+    ReadUnitFile(fCollection.GetRoot().Read(path).text, hidden);
+    unit.file.description = hidden.description;
 }
 
 void TUnitFiles::TakeLink(const std::string& folder, const std::string& name, TUnit& unit)

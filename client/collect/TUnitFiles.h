@@ -28,6 +28,7 @@ class TUnitFiles {
     /// A folder that cannot be read is left out of the collection.
     std::vector<TFolderEntry> EntriesOf(const std::string& folder);
     void TakeUnit(const std::string& folder, const TFolderEntry& entry);
+    void TakeHidden(const std::string& path, TUnit& unit);
     void TakeLink(const std::string& folder, const std::string& name, TUnit& unit);
     void TakeOtherName(const std::string& folder, const std::string& name, const std::string& target);
     void TakeText(const std::string& path, TUnit& unit);

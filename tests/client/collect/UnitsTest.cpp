@@ -111,6 +111,15 @@ TEST_F(UnitsTest, LinksOfGeneratorsEnableUntilTheNextStart)
               States());
 }
 
+TEST_F(UnitsTest, MaskedUnitKeepsItsDescription)
+{
+    EXPECT_EQ(
+        "KALMO_ConfigurationFile  + /etc/systemd/system/ssh.service   Type link, Owner root, Group root, LinkTarget /dev/null\n"
+        "KALMO_Unit               ~ ssh.service.File: /usr/lib/systemd/system/ssh.service -> /etc/systemd/system/ssh.service\n"
+        "                         ~ ssh.service.UnitFileState: enabled -> masked\n",
+        FoundAfter([](TMadeSystem& system) { system.Link("/etc/systemd/system/ssh.service", "/dev/null"); }));
+}
+
 TEST_F(UnitsTest, UnitWhoseFileCannotBeReadHasNoStateOfItsFile)
 {
     fSystem->Link("/etc/systemd/system/gone.service", "/opt/gone/gone.service");
