@@ -122,6 +122,17 @@ TEST_F(KindsTest, CountersAndSecretsOfTheKernelAreNotRead)
     EXPECT_EQ("Name: loop, Size: 40960, State: Live, UsedBy: {}, Parameters: {\"max_loop=8\"}\n", Lines("KALMO_KernelModule"));
 }
 
+TEST_F(KindsTest, ModulesThatAreLoadedByLookingAreLeftOut)
+{
+    fSystem->File("/proc/modules", "tcp_diag 16384 0 - Live 0x0\n"
+                                   "inet_diag 28672 1 tcp_diag, Live 0x0\n"
+                                   "vsock 57344 2 vsock_diag,vhost_vsock, Live 0x0\n"
+                                   "diag 16384 0 - Live 0x0\n");
+    EXPECT_EQ("Name: vsock, Size: 57344, State: Live, UsedBy: {\"vhost_vsock\"}, Parameters: {}\n"
+              "Name: diag, Size: 16384, State: Live, UsedBy: {}, Parameters: {}\n",
+              Lines("KALMO_KernelModule"));
+}
+
 TEST_F(KindsTest, ParametersOfMadeInterfacesAreLeftOut)
 {
     for (const std::string interface : {"all", "default", "lo", "eth0", "veth1", "bond0"}) {
