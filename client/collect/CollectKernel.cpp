@@ -1,9 +1,9 @@
 // Modules of the kernel, and the parameters of /proc/sys.
 //
-// Some files of /proc/sys are no settings: they count, they are made anew at each read, the kernel changes them, or they are
-// secrets. They are never read. The parameters of an interface that the kernel makes, such as that of a container, are left out,
-// because there are hundreds of each; those of adapters, bonds and VLANs, of "all", of "default" and of lo stay. Files that can
-// only be written are commands and are passed over without a word.
+// Some files of /proc/sys are no settings: they count, they are made anew at each read, the kernel changes them or calculates
+// them from the memory that is free at the start, or they are secrets. They are never read. The parameters of an interface that the
+// kernel makes, such as that of a container, are left out, because there are hundreds of each; those of adapters, bonds and VLANs,
+// of "all", of "default" and of lo stay. Files that can only be written are commands and are passed over without a word.
 #include <fnmatch.h>
 
 #include <algorithm>
@@ -42,6 +42,7 @@ constexpr const char* kNoSettings[] = {
     "net/core/netdev_rss_key",
     "net/netfilter/nf_conntrack_count",
     "vm/stat_refresh",
+    "vm/user_reserve_kbytes",
     "net/ipv*/conf/*/stable_secret",
     "net/ipv4/tcp_fastopen_key",
     "net/*/*/base_reachable_time",

@@ -112,12 +112,14 @@ TEST_F(KindsTest, CountersAndSecretsOfTheKernelAreNotRead)
     fSystem->File("/proc/sys/net/core/netdev_rss_key", "1:2\n").File("/proc/sys/kernel/hung_task_detect_count", "1\n");
     fSystem->File("/proc/sys/net/ipv4/conf/eth0.5/forwarding", "1\n").File("/proc/sys/kernel/empty", "\n");
     fSystem->File("/sys/class/net/eth0.5/uevent", "DEVTYPE=vlan\nINTERFACE=eth0.5\n");
+    fSystem->File("/proc/sys/vm/user_reserve_kbytes", "30177\n").File("/proc/sys/vm/admin_reserve_kbytes", "8192\n");
     fSystem->File("/proc/modules", "loop 40960 0 - Live 0x0\n").File("/sys/module/loop/parameters/max_loop", "8\n");
     EXPECT_EQ("Name: kernel.empty, Value: \"\"\n"
               "Name: kernel.osrelease, Value: 6.1.0-25-amd64\n"
               "Name: net.ipv4.conf.eth0/5.forwarding, Value: 1\n"
               "Name: net.ipv4.ip_forward, Value: 0\n"
-              "Name: net.ipv4.tcp_rmem, Value: 4096 131072 6291456\n",
+              "Name: net.ipv4.tcp_rmem, Value: 4096 131072 6291456\n"
+              "Name: vm.admin_reserve_kbytes, Value: 8192\n",
               Lines("KALMO_KernelParameter"));
     EXPECT_EQ("Name: loop, Size: 40960, State: Live, UsedBy: {}, Parameters: {\"max_loop=8\"}\n", Lines("KALMO_KernelModule"));
 }
