@@ -16,11 +16,12 @@ std::vector<TFacts> TOmissions::MakeFacts() const
 {
     std::vector<TFacts> facts;
     for (const auto& [key, subjects] : fSubjects) {
-        facts.push_back(TFacts("KALMO_NotCollected")
-                            .Key("Kind", key.first)
-                            .Key("Reason", key.second)
-                            .Number("Count", subjects.count)
-                            .Texts("Subjects", subjects.named));
+        TFacts lack("KALMO_NotCollected");
+        lack.Key("Kind", key.first).Key("Reason", key.second).Number("Count", subjects.count).Texts("Subjects", subjects.named);
+        if (subjects.count > subjects.named.size()) {
+            lack.Number("Others", subjects.count - subjects.named.size());
+        }
+        facts.push_back(lack);
     }
     return facts;
 }

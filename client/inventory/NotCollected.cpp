@@ -19,6 +19,7 @@ const char kDeclaration[] =
     "<PROPERTY NAME=\"Reason\" TYPE=\"string\"><QUALIFIER NAME=\"Key\" TYPE=\"boolean\"><VALUE>TRUE</VALUE></QUALIFIER></PROPERTY>"
     "<PROPERTY NAME=\"Count\" TYPE=\"uint32\"></PROPERTY>"
     "<PROPERTY.ARRAY NAME=\"Subjects\" TYPE=\"string\"></PROPERTY.ARRAY>"
+    "<PROPERTY NAME=\"Others\" TYPE=\"uint32\"></PROPERTY>"
     "</CLASS></VALUE.OBJECT>\n";
 
 void AppendText(std::string& xml, const char* name, const std::string& type, const std::string& value)

@@ -35,7 +35,8 @@ TEST_F(BadSystemsTest, WhatIsLeftOutIsInTheInventory)
               "    Kind: files\n"
               "    Reason: it may hold keys or passwords\n"
               "    Count: 1\n"
-              "    Subjects: {\"/etc/shadow\"}\n",
+              "    Subjects: {\"/etc/shadow\"}\n"
+              "    Others: NULL\n",
               Show("KALMO_NotCollected"));
 }
 

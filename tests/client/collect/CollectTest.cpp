@@ -45,7 +45,7 @@ TEST_F(CollectTest, EachChangeIsFoundAlone)
          "KALMO_ConfigurationFile  ~ /etc/ssh/sshd_config.Digest: "
          "sha256:e807422bad84e7926a98fb262153b3d9c84244080e69b0e5d20446c183ffafc4 -> NULL\n"
          "                         ~ /etc/ssh/sshd_config.Mode: 0644 -> 0600\n"
-         "KALMO_NotCollected       + only root may read it   Count 1, Subjects {/etc/ssh/sshd_config}\n"},
+         "KALMO_NotCollected       + only root may read it   Subjects {/etc/ssh/sshd_config}\n"},
     };
     for (const auto& row : rows) {
         EXPECT_EQ(row.found, FoundAfter(row.change));
@@ -60,6 +60,14 @@ TEST_F(CollectTest, ChangedFileIsFoundByItsDigest)
               "sha256:e807422bad84e7926a98fb262153b3d9c84244080e69b0e5d20446c183ffafc4 -> "
               "sha256:bdc45620d3cbb299dd7f748340f858226752470f6ce378000a4f5485bf35070e\n",
               FoundAfter([](TMadeSystem& system) { system.File("/etc/ssh/sshd_config", "Port 2222\n"); }));
+}
+
+TEST_F(CollectTest, WhatIsNotCollectedDiffersBySubjectsAlone)
+{
+    fSystem->File("/etc/a.conf", "", 0600);
+    EXPECT_EQ("KALMO_ConfigurationFile  + /etc/b.conf   Type file, Owner root, Group root, Mode 0600\n"
+              "KALMO_NotCollected       ~ only root may read it.Subjects: +/etc/b.conf\n",
+              FoundAfter([](TMadeSystem& system) { system.File("/etc/b.conf", "", 0600); }));
 }
 
 TEST_F(CollectTest, OperatingSystemIsDescribed)

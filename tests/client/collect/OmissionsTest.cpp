@@ -45,7 +45,7 @@ TEST(OmissionsTest, ManySubjectsAreCounted)
     EXPECT_EQ("not collected: files: 0, 1, 2 and 22 others: x\n", LinesOf(omissions));
     const std::string facts = FactsText(omissions.MakeFacts());
     EXPECT_EQ("NotCollected: Kind=files Reason=x Count=25 Subjects={\"0\"", facts.substr(0, 56));
-    EXPECT_NE(std::string::npos, facts.find("\"19\"}\n")) << facts;
+    EXPECT_NE(std::string::npos, facts.find("\"19\"} Others=5\n")) << facts;
 }
 
 TEST(OmissionsTest, NothingIsNoLine)
