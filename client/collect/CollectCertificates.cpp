@@ -23,9 +23,18 @@ bool MayHoldCertificates(const std::string& path)
                                               [&path](const char* suffix) { return EndsWith(path, suffix); });
 }
 
+// Returns whether to go into it if it is a folder.
 bool AddCertificates(TCollection& collection, const std::string& path, const struct stat& status)
 {
-    if (!S_ISREG(status.st_mode) || !MayHoldCertificates(path)) {
+    const bool isFolder = S_ISDIR(status.st_mode);
+    if (!isFolder && (!S_ISREG(status.st_mode) || !MayHoldCertificates(path))) {
+        return false;
+    }
+    if (collection.IsLeftToRoot(status)) {
+        collection.LeaveToRoot(path);
+        return false;
+    }
+    if (isFolder) {
         return true;
     }
     const TFileText file = collection.GetRoot().Read(path, kMostCertificateFileBytes);

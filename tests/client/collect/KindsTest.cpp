@@ -238,6 +238,23 @@ TEST_F(KindsTest, CertificatesAreThoseInFilesThatAreNamedSo)
         << fLines;
 }
 
+TEST_F(KindsTest, CertificatesThatOnlyRootMayReadAreLeftToRoot)
+{
+    const std::string broken = "-----BEGIN CERTIFICATE-----\nAAAA\n-----END CERTIFICATE-----\n";
+    fSystem->File("/etc/ssl/mine.crt", broken, 0640).File("/etc/own/deep.crt", broken);
+    ASSERT_EQ(0, chmod(fSystem->Place("/etc/own").c_str(), 0750));
+    Show("KALMO_Certificate");
+    EXPECT_NE(std::string::npos, fLines.find("not collected: certificates: /etc/own, /etc/ssl/mine.crt: only root may read it (as "
+                                             "root, --root-files includes it)\n"))
+        << fLines;
+    TCollectionOptions options;
+    options.hasRootFiles = true;
+    Show("KALMO_Certificate", options);
+    EXPECT_NE(std::string::npos, fLines.find("not collected: certificates: /etc/own/deep.crt, /etc/ssl/mine.crt: line 1: found a "
+                                             "block that cannot be read, expected a certificate\n"))
+        << fLines;
+}
+
 TEST_F(KindsTest, EachClassSaysWhatItIs)
 {
     const std::string text = Run({"show", fSystem->CollectTo("x.xml").c_str(), "-o", "cimxml"});
