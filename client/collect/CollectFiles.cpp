@@ -3,6 +3,7 @@
 // Whether the contents are read depends on the permissions and the name, not on who collects, so the inventories of root and of
 // another user meet: a file that not everybody may read has a digest only if --root-files asked for it, and one for keys or
 // passwords never has one. Who owns them, and with which permissions, is in the inventory all the same.
+#include <fnmatch.h>
 
 #include <algorithm>
 #include <array>
@@ -13,7 +14,9 @@
 #include "client/collect/HoldsSecrets.h"
 #include "client/collect/MatchesAny.h"
 #include "client/collect/TFileWalk.h"
+#include "client/collect/TUnitFiles.h"
 #include "client/collect/read/ReadAccounts.h"
+#include "client/collect/read/TextPieces.h"
 
 namespace NORVZEL20 {
 
@@ -87,7 +90,10 @@ class TConfigurationFiles {
           fGroups(NamesByNumber("/etc/group", &ReadGroups, "GroupID"))
     {}
 
-    bool IsWanted(const std::string& path) const { return !fCollection.IsExcluded(path) && !MatchesAny(path, kNoConfiguration); }
+    bool IsWanted(const std::string& path) const
+    {
+        return !fCollection.IsExcluded(path) && !MatchesAny(path, kNoConfiguration) && !IsRepeatedByUnit(path);
+    }
 
     bool Visit(const std::string& path, const struct stat& status)
     {
@@ -114,6 +120,21 @@ class TConfigurationFiles {
 
   private:
     using TNames = std::map<std::string, std::string>;
+
+    // Whether it is a link such as /etc/rc3.d/S01ssh, and systemd starts ssh.service instead. The state of that unit says whether
+    // it is enabled, and both change together. For a script without such a unit, the links are what says it.
+    bool IsRepeatedByUnit(const std::string& path) const
+    {
+        if (fnmatch("/etc/rc[0-9S].d/[KS][0-9][0-9]*", path.c_str(), FNM_PATHNAME) != 0 ||
+            !fCollection.GetRoot().Look("/run/systemd/system")) {
+            return false;
+        }
+        std::string script = path.substr(std::string("/etc/rc3.d/S01").size());
+        script = EndsWith(script, ".sh") ? script.substr(0, script.size() - 3) : script;
+        const std::map<std::string, TUnit>& units = fCollection.GetUnitFiles().GetUnits();
+        const auto unit = units.find(script + ".service");
+        return unit != units.end() && unit->second.state != "generated";
+    }
 
     TNames NamesByNumber(const std::string& path, TCollection::TReader reader, const char* number) const
     {

@@ -24,6 +24,19 @@ class KindsTest : public TCollectFixture {
         }
         return text + "\n";
     }
+
+    /// The names of what is in folders such as /etc/rc3.d.
+    std::string RunLevelFiles()
+    {
+        const std::string shown = Show("KALMO_ConfigurationFile");
+        std::string names;
+        for (const std::string_view line : SplitAt(shown, '\n')) {
+            if (StartsWith(line, "    Name: /etc/rc") && line.find(".d/") != std::string_view::npos) {
+                names += std::string(line.substr(line.rfind('/') + 1)) + " ";
+            }
+        }
+        return names;
+    }
 };
 
 TEST_F(KindsTest, ComputerSystemIsWhatTheFirmwareSays)
@@ -253,6 +266,19 @@ TEST_F(KindsTest, CertificatesThatOnlyRootMayReadAreLeftToRoot)
     EXPECT_NE(std::string::npos, fLines.find("not collected: certificates: /etc/own/deep.crt, /etc/ssl/mine.crt: line 1: found a "
                                              "block that cannot be read, expected a certificate\n"))
         << fLines;
+}
+
+TEST_F(KindsTest, LinksOfRunLevelsAreLeftOutIfSystemdHasTheUnit)
+{
+    fSystem->Link("/etc/rc3.d/S01ssh", "../init.d/ssh").Link("/etc/rc0.d/K05ssh", "../init.d/ssh").File("/etc/rc3.d/README", "");
+    fSystem->Link("/etc/rc3.d/S02own", "../init.d/own").Link("/etc/rc3.d/S03late", "../init.d/late");
+    fSystem->Link("/etc/rcS.d/S04kmod", "../init.d/kmod").Link("/etc/rcS.d/S05boot.sh", "../init.d/boot.sh");
+    fSystem->File("/usr/lib/systemd/system/kmod.service", "[Service]\n").File("/lib/systemd/system/boot.service", "[Service]\n");
+    fSystem->File("/run/systemd/generator.late/late.service", "[Service]\n");
+    EXPECT_EQ("README S02own S03late ", RunLevelFiles());
+    fSystem->Unlink("/run/systemd/system/.keep");
+    fSystem->RemoveFolder("/run/systemd/system");
+    EXPECT_EQ("K05ssh README S01ssh S02own S03late S04kmod S05boot.sh ", RunLevelFiles());
 }
 
 TEST_F(KindsTest, EachClassSaysWhatItIs)
