@@ -8,4 +8,7 @@ namespace NORVZEL20 {
 /// come with the program: `linux` is data/rules/linux.xml below the host's root. Errors: std::bad_alloc.
 std::string FindRules(const std::string& name);
 
+/// Where FindRules found no rules that come with the program: ", and the program has no rules /PATH"; empty if the name is no word.
+std::string WhyNoRules(const std::string& name);
+
 }  // namespace NORVZEL20

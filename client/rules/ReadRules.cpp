@@ -25,7 +25,7 @@ void CheckPath(const std::string& path)
     }
     if (access(path.c_str(), R_OK) != 0) {
         const std::error_code reason = LastSystemError();
-        throw TClientError(path + ": cannot be opened", reason, kAdvice);
+        throw TClientError(path + ": cannot be opened", reason, WhyNoRules(path) + kAdvice);
     }
     struct stat status;
     if (stat(path.c_str(), &status) == 0 && S_ISDIR(status.st_mode)) {

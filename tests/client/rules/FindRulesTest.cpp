@@ -8,6 +8,9 @@
 #include <fstream>
 #include <string>
 
+#include "client/process/TClientError.h"
+#include "client/rules/ReadRules.h"
+
 namespace NORVZEL20 {
 namespace {
 
@@ -27,6 +30,16 @@ class FindRulesTest : public testing::Test {
         unlink("linux");
         ASSERT_EQ(0, chdir("/"));
         rmdir(fFolder.c_str());
+    }
+
+    static std::string Complaint(const std::string& name)
+    {
+        try {
+            ReadRules(name);
+        } catch (const TClientError& error) {
+            return error.what();
+        }
+        return "none";
     }
 
     std::string fFolder;
@@ -53,6 +66,16 @@ TEST_F(FindRulesTest, EverythingElseIsAPath)
     for (const char* name : {"", "-", "none", "linux.xml", "./linux", "../rules/linux", "Linux"}) {
         EXPECT_EQ(name, FindRules(name)) << name;
     }
+}
+
+TEST_F(FindRulesTest, AWordWithoutRulesIsRefusedWithTheFileThatWasLookedFor)
+{
+    const std::string shipped = FindRules("linux");
+    const std::string folder = shipped.substr(0, shipped.rfind('/') + 1);
+    const std::string advice = "; name a rules file that can be read, or - for standard input";
+    EXPECT_EQ("none: cannot be opened: No such file or directory, and the program has no rules " + folder + "none.xml" + advice,
+              Complaint("none"));
+    EXPECT_EQ("none.xml: cannot be opened: No such file or directory" + advice, Complaint("none.xml"));
 }
 
 }  // namespace
