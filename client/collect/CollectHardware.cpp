@@ -75,6 +75,7 @@ void AddDisk(TCollection& collection, const std::string& disk)
         .Text("SerialNumber", FirstOf(collection.ReadValue(folder + "device/serial"), collection.ReadValue(folder + "serial")))
         .Text("ElementName", FirstOf(collection.ReadValue(folder + "dm/name"), collection.ReadValue(folder + "md/level")))
         .Text("Scheduler", ChosenIn(collection.ReadValue(folder + "queue/scheduler")))
+        .Text("BackingFile", collection.ReadValue(folder + "loop/backing_file"))
         .Texts("Parts", NamesIn(collection.GetRoot(), folder + "slaves"));
     AddNumber(facts, "Size", size, kSectorBytes);
     AddNumber(facts, "BlockSize", collection.ReadValue(folder + "queue/logical_block_size"));

@@ -57,11 +57,12 @@ TEST_F(KindsTest, DisksHaveTheirPartitions)
         .File("/sys/block/sda/sda1/start", "64\n")
         .File("/sys/block/sda/power/x", "");
     fSystem->File("/sys/block/loop0/size", "0\n").File("/sys/block/ram0/size", "8\n").File("/sys/block/loop1/size", "2\n");
+    fSystem->File("/sys/block/loop1/loop/backing_file", "/srv/disk.img\n");
     fSystem->File("/sys/block/dm-0/size", "many\n")
         .File("/sys/block/dm-0/dm/name", "vg-root\n")
         .File("/sys/block/dm-0/slaves/sda1", "");
     EXPECT_EQ("DeviceID: dm-0, ElementName: vg-root, Parts: {\"sda1\"}\n"
-              "DeviceID: loop1, Size: 1024, Parts: {}\n"
+              "DeviceID: loop1, Size: 1024, Parts: {}, BackingFile: /srv/disk.img\n"
               "DeviceID: sda, Size: 1048576, Model: Disk 5, Rotational: TRUE, Scheduler: mq-deadline, Parts: {}\n",
               Lines("KALMO_Disk"));
     EXPECT_EQ("DeviceID: sda1, Size: 524288, Disk: sda, Number: 1, StartingOffset: 32768\n", Lines("KALMO_DiskPartition"));
