@@ -39,12 +39,15 @@ bool IsName(std::string_view text)
     });
 }
 
-// Whether it is what a path can have as the value of a key.
+// Whether it is what a path can have as the value of a key. An array as a key is passed as it is.
 bool IsKeyValue(std::string_view value)
 {
     using TType = TCIMValue::TCIMType;
     if (!value.empty() && (value.front() == '"' || value.front() == '\'')) {
         return FindEndOfQuoted(value, 0) + 1 == value.size();
+    }
+    if (!value.empty() && value.front() == '{') {
+        return value.back() == '}';
     }
     TCIMValue read;
     return value == "NULL" || TValueText::Parse(TType::kBoolean, value, read) || TValueText::Parse(TType::kReal64, value, read);
