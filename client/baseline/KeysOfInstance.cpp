@@ -14,8 +14,10 @@ std::vector<TKeyText> KeysOfInstance(std::string_view instance)
         const std::size_t begin = end + 1;
         const std::string_view rest = instance.substr(begin);
         std::size_t length = rest.size();
+        int open = 0;  // braces of arrays
         ForEachUnquoted(rest, [&](std::size_t at) {
-            length = rest[at] == ',' ? at : length;
+            open += rest[at] == '{' ? 1 : rest[at] == '}' ? -1 : 0;
+            length = rest[at] == ',' && open <= 0 ? at : length;
             return length == rest.size();
         });
         const std::string_view key = rest.substr(0, length);

@@ -42,8 +42,10 @@ void TEntryScanner::Advance()
     }
     fEnd = fText.size();
     const std::string_view rest = fText.substr(fBegin);
+    int braces = 0;  // open ones: an array is one field, also as a key
     const std::size_t open = ForEachUnquoted(rest, [&](std::size_t at) {
-        if (rest[at] == ' ' || rest[at] == '\t') {
+        braces += rest[at] == '{' ? 1 : rest[at] == '}' ? -1 : 0;
+        if (braces <= 0 && (rest[at] == ' ' || rest[at] == '\t')) {
             fEnd = fBegin + at;
             return false;
         }

@@ -44,6 +44,7 @@ TEST(BaselineFileTest, EntriesAreReadAndWrittenInOneSpelling)
         {"+ D P: datetime \"20261122104400.000000+060\" in a", "+ D P: datetime \"20261122094400.000000+000\" in a\n"},
         {"+ D (instances): 03, P: \"a\" x02 in a", "+ D (instances): 3, P: \"a\" x2 in a\n"},
         {"- D.K={\"a\"},R=NaN in a", "- D.K={\"a\"},R=NaN in a\n"},
+        {"+ D.K={\"a, }\", \"b\"},R=2 P: \"x\" in a", "+ D.K={\"a, }\", \"b\"},R=2 P: \"x\" in a\n"},
         {"- D.A=TRUE,B=-5,C=1.5,E='\"',F=\"a,b=\",G=NULL in a", "- D.A=TRUE,B=-5,C=1.5,E='\"',F=\"a,b=\",G=NULL in a\n"},
         {"+ D (instances): 3, P: \"a\" x2  / NULL in a", "+ D (instances): 3, P: \"a\" x2 / NULL in a\n"},
         {"+ D Z: uint8 1 , A: string[] {\"a,\", \"b\"}, B: \"in\" in a",

@@ -257,7 +257,8 @@ TEST_F(BadInputTest, AnEmptyArgumentIsNoArgument)
 
 TEST_F(BadInputTest, BracketsAreNoList)
 {
-    EXPECT_EQ("cimdelta: [a: cannot be opened: No such file or directory; 1 more cannot be read: b]\n", Complaint({"compare", "web01.xml", "[a,b]"}));
+    EXPECT_EQ("cimdelta: [a: cannot be opened: No such file or directory; 1 more cannot be read: b]\n",
+              Complaint({"compare", "web01.xml", "[a,b]"}));
     EXPECT_EQ("cimdelta: [a]: cannot be opened: No such file or directory\n", Complaint({"show", "[a]"}));
     EXPECT_EQ("cimdelta: [json] is no format; name one: text, json, ndjson or cimxml; see cimdelta show --help\n",
               Complaint({"show", "web01.xml", "-o", "[json]"}));

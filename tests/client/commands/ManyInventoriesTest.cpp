@@ -35,7 +35,8 @@ class ManyInventoriesTest : public TProgramFixture {
 
 TEST_F(ManyInventoriesTest, AreComparedWithFewDescriptors)
 {
-    const std::string outcome = Shell(Line("compare --detail web01.xml", Inventories("web01-again.xml", 50, "web03.xml")), "ulimit -n 40; ");
+    const std::string outcome =
+        Shell(Line("compare --detail web01.xml", Inventories("web01-again.xml", 50, "web03.xml")), "ulimit -n 40; ");
     EXPECT_EQ("[1]\n5 differences between web01 and ", outcome.substr(0, 36));
     EXPECT_NE(std::string::npos, outcome.find("    Version: 5.1 -> web03: 5.2\n")) << outcome;
 }

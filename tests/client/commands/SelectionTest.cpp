@@ -294,8 +294,9 @@ TEST_F(SelectionTest, NamesThatMeanNothingAreErrors)
 TEST_F(SelectionTest, APropertyThatIsNotComparedCannotBeSelected)
 {
     const std::string rules = Scratch("rules.xml", RulesOf(ExcludeOf("Package", "Version")));
-    EXPECT_EQ("cimdelta: --property Version: is not compared without the option either; cimdelta explain Package.Version says why\n",
-              Complaint({"compare", fBefore, fAfter, "--spec", rules, "--property", "Version"}));
+    EXPECT_EQ(
+        "cimdelta: --property Version: is not compared without the option either; cimdelta explain Package.Version says why\n",
+        Complaint({"compare", fBefore, fAfter, "--spec", rules, "--property", "Version"}));
 }
 
 TEST_F(SelectionTest, NothingThatOptionsLeaveIsAnError)
