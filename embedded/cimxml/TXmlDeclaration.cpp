@@ -111,6 +111,9 @@ EXmlScan TXmlDeclaration::FindNext(const char* at, const char* end) noexcept
         if (bytes.substr(0, mark.size()) == mark) {
             return EXmlScan::kAccepted;
         }
+        if (!bytes.empty() && mark.substr(0, bytes.size()) == bytes) {
+            return EXmlScan::kCutOff;
+        }
     }
     if (bytes.empty() || bytes[0] != '<') {
         return EXmlScan::kRefused;

@@ -153,7 +153,10 @@ bool TXmlReader::HasNextDocument() const
         return false;
     }
     const std::string_view rest = fExpat->GetRest();
-    return !fExpat->IsWithinToken() && TXmlDeclaration::FindNext(rest.data(), rest.data() + rest.size()) == EXmlScan::kAccepted;
+    const EXmlScan next = TXmlDeclaration::FindNext(rest.data(), rest.data() + rest.size());
+    // A byte order mark may come in two pieces: Expat refuses its first byte.
+    const bool isMarkBegun = next == EXmlScan::kCutOff && rest.front() != '<';
+    return !fExpat->IsWithinToken() && (next == EXmlScan::kAccepted || isMarkBegun);
 }
 
 /// Begins the next document of a sequence at the place that Expat has refused.

@@ -87,11 +87,18 @@ TEST(SequenceTest, BothParsersReadTheSameInAnyPieces)
 
 TEST(SequenceTest, MutatedSequencesReadTheSame)
 {
+    // Where Expat refuses what follows a document in UTF-16 depends on how the bytes were cut.
+    std::vector<std::string> texts;
+    for (const TSequenceRow& row : GetRows()) {
+        if (row.text.find('\xFF') == std::string::npos) {
+            texts.push_back(row.text);
+        }
+    }
     std::size_t read = 0;
     for (unsigned int number = 1; number <= 4000 && !HasFailure(); ++number) {
         std::mt19937 random(number);
-        const std::string& first = GetRows()[random() % GetRows().size()].text;
-        const std::string& second = GetRows()[random() % GetRows().size()].text;
+        const std::string& first = texts[random() % texts.size()];
+        const std::string& second = texts[random() % texts.size()];
         const std::string text = MutateXml(first + second, random);
         for (const std::size_t piece : {std::size_t{0}, 1 + random() % kLongestSequencePiece}) {
             const std::string expected = ReadXml(text, piece, EParser::kExpat, true).events;
