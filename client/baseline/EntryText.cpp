@@ -11,9 +11,13 @@ namespace {
 bool IsField(const std::string& text)
 {
     bool isWhole = !text.empty() && text.front() != '"' && text.front() != '\'' && text.back() != ',' && text != "in";
-    const std::size_t open = ForEachUnquoted(
-        text, [&](std::size_t at) { return isWhole = isWhole && text[at] != ' ' && text[at] != '\t' && text[at] != '#'; });
-    return isWhole && open == std::string_view::npos && FindBadEscape(text) == std::string_view::npos;
+    int braces = 0;  // open ones: an array is one field
+    const std::size_t open = ForEachUnquoted(text, [&](std::size_t at) {
+        braces += text[at] == '{' ? 1 : text[at] == '}' ? -1 : 0;
+        const bool isBlank = text[at] == ' ' || text[at] == '\t';
+        return isWhole = isWhole && braces >= 0 && (!isBlank || braces > 0) && text[at] != '#';
+    });
+    return isWhole && braces == 0 && open == std::string_view::npos && FindBadEscape(text) == std::string_view::npos;
 }
 
 std::string QuotedField(const std::string& text)
@@ -59,7 +63,7 @@ std::string EntryText(const TAcceptedDifference& entry)
     text += " in ";
     for (std::size_t i = 0; i < entry.inventories.size(); ++i) {
         const std::string& label = entry.inventories[i];
-        text += (i == 0 ? "" : ", ") + (label.find(',') == std::string::npos ? FieldText(label) : QuotedField(label));
+        text += (i == 0 ? "" : ", ") + (label.find_first_of(", \t") == std::string::npos ? FieldText(label) : QuotedField(label));
     }
     return text;
 }

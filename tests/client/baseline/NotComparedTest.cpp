@@ -105,6 +105,25 @@ TEST_F(NotComparedTest, WhatWasAcceptedByOtherKeysIsNotGone)
     EXPECT_NE(std::string::npos, Since().find("3 accepted differences.\n")) << fReport;
 }
 
+TEST_F(NotComparedTest, AnArrayAsAKeyIsReadBack)
+{
+    const std::string key =
+        "<PROPERTY.ARRAY NAME=\"Id\" TYPE=\"uint8\"><QUALIFIER NAME=\"Key\" TYPE=\"boolean\"><VALUE>TRUE</VALUE>"
+        "</QUALIFIER></PROPERTY.ARRAY>";
+    const auto disk = [&](const char* size) {
+        return Class("Disk", "", key + Declaration("Size", "uint16")) +
+               Instance("Disk",
+                        "<PROPERTY.ARRAY NAME=\"Id\" TYPE=\"uint8\"><VALUE.ARRAY><VALUE>1</VALUE><VALUE>2</VALUE></VALUE.ARRAY>"
+                        "</PROPERTY.ARRAY>" +
+                            Value("Size", size, "uint16"));
+    };
+    SystemWith("web01", disk("1"));
+    SystemWith("web02", disk("2"));
+    Accept();
+    EXPECT_EQ("~ Disk.Id={1, 2} Size: uint16 1 -> uint16 2 in web02\n", Entries());
+    EXPECT_NE(std::string::npos, Since().find("1 accepted difference.\n")) << fReport;
+}
+
 TEST_F(NotComparedTest, WithExcludedKeysNamesMayBeInAnyLetterCase)
 {
     const std::string disks = Class("Disk", "", KeyProperty("Id") + KeyProperty("Bus") + Declaration("Size", "uint16")) +
