@@ -287,15 +287,17 @@ std::string TClassLines::JoinContents(const std::vector<std::string>& contents, 
     const char separator[] = ", ";
     const char rest[] = "...";
     std::string text;
+    bool isCut = false;
     for (std::size_t i = 0; i < contents.size(); ++i) {
-        const std::string next = text + (i > 0 ? separator : "") + contents[i];
-        const std::size_t behind = i + 1 < contents.size() ? sizeof separator + sizeof rest - 2 : 0;
-        if (!areWhole && next.size() + behind > room) {
-            return text + (i > 0 ? separator : "") + rest;
+        const std::string next = text + (text.empty() ? "" : separator) + contents[i];
+        const std::size_t behind = isCut || i + 1 < contents.size() ? sizeof separator + sizeof rest - 2 : 0;
+        if (areWhole || next.size() + behind <= room) {
+            text = next;
+        } else {
+            isCut = true;
         }
-        text = next;
     }
-    return text;
+    return !isCut ? text : text + (text.empty() ? "" : separator) + rest;
 }
 
 }  // namespace NORVZEL20
