@@ -24,10 +24,10 @@ namespace {
 
 constexpr std::array<const char*, 2> kConfigurationFolders = {"/etc", "/usr/local/etc"};
 
-// What programs write by themselves, and what editors and package managers leave behind.
+// What programs write by themselves, and what editors and package managers have there while they work. Copies that stay, such as
+// site~ and site.bak, are read by programs that read whole folders.
 constexpr const char* kNoConfiguration[] = {
-    "*~",
-    "*.swp",
+    "*/.*.sw[op]",
     "*/.git",
     "/etc/*.dpkg-new",
     "/etc/*.dpkg-tmp",

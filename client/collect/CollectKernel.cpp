@@ -18,6 +18,7 @@ namespace NORVZEL20 {
 namespace {
 
 constexpr char kParameterFolder[] = "/proc/sys";
+constexpr char kInterfaceFolder[] = "/sys/class/net";
 constexpr std::size_t kMostParameterBytes = 1U << 20U;
 constexpr int kMostParameterFolders = 16;  // within each other
 
@@ -67,10 +68,10 @@ bool IsOfMadeInterface(const TSystemRoot& root, const std::string& name)
     }
     const std::string interface = name.substr(name.rfind('/') + 1);
     const bool isOfAll = interface == "all" || interface == "default" || interface == "lo";
-    const std::string folder = "/sys/class/net/" + interface;
+    const std::string folder = kInterfaceFolder + ("/" + interface);
     const bool isSetUp = root.Look(folder + "/device") || root.Look(folder + "/bonding") ||
                          root.Read(folder + "/uevent").text.find("DEVTYPE=vlan\n") != std::string::npos;
-    return !isOfAll && !isSetUp && root.Look("/sys/class/net");
+    return !isOfAll && !isSetUp;
 }
 
 bool CanBeRead(const TSystemRoot& root, const std::string& path)
@@ -163,6 +164,9 @@ void CollectKernel(TCollection& collection)
     AddModules(collection);
     if (!collection.GetRoot().Look(kParameterFolder)) {
         collection.LeaveOut(kParameterFolder, "there is no such folder");
+    }
+    if (!collection.GetRoot().Look(kInterfaceFolder)) {
+        collection.LeaveOut("parameters of interfaces", std::string("there is no ") + kInterfaceFolder + " to tell adapters by");
     }
     AddParameters(collection, std::string(), 0);
 }

@@ -27,7 +27,7 @@ bool TCollection::IsLeftToRoot(const struct stat& status) const
 
 void TCollection::LeaveToRoot(const std::string& path)
 {
-    LeaveOut(path, "only root may read it", "as root, --root-files includes it");
+    LeaveOut(path, "not everybody may read it", "as root, --root-files includes it");
 }
 
 void TCollection::CheckTime() const

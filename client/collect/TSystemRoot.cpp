@@ -104,7 +104,7 @@ TSystemRoot::TSystemRoot(const std::string& path)
 std::string TSystemRoot::TroubleOf(int error)
 {
     if ((error == EACCES || error == EPERM) && geteuid() != 0) {
-        return "only root may read it";
+        return "not everybody may read it";
     }
     return std::generic_category().message(error);
 }

@@ -52,8 +52,8 @@ std::vector<TMount> ReadMountInfo(std::string_view text, TReadFaults& faults)
         const auto begin = fields.begin() + static_cast<std::ptrdiff_t>(std::min(kFirstOptional, fields.size()));
         const auto hyphen = std::find(begin, fields.end(), "-");
         if (fields.end() - hyphen < 4) {
-            faults.Add(lines.GetNumber(),
-                       "found " + Quoted(lines.GetLine()) + ", expected a mount with its type, source and options");
+            // The line is not shown: its source and options may hold a password.
+            faults.Add(lines.GetNumber(), "found no mount, expected one with its type, source and options");
             continue;
         }
         mounts.push_back({Unescaped(fields[4]), Unescaped(hyphen[1]), WithoutPassword(Unescaped(hyphen[2])), Unescaped(fields[3]),

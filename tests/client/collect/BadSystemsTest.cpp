@@ -79,7 +79,8 @@ TEST_F(BadSystemsTest, EmptySystemSaysWhatItLacks)
         lines += line + "\n";
     }
     EXPECT_EQ("not collected: disks: /sys/block: there is no such folder\n"
-              "not collected: kernel: /proc/sys: there is no such folder\n"
+              "not collected: kernel: parameters of interfaces: there is no /sys/class/net to tell adapters by; /proc/sys: there "
+              "is no such folder\n"
               "not collected: memory: /proc/meminfo, /proc/swaps: No such file or directory\n"
               "not collected: mounts: /proc/self/mountinfo: No such file or directory\n"
               "not collected: network: /sys/class/net: found no adapter, expected one\n"
@@ -98,7 +99,7 @@ TEST_F(BadSystemsTest, EmptySystemSaysWhatItLacks)
 TEST_F(BadSystemsTest, TablesThatEndEarlyAreOneLine)
 {
     fSystem->File("/proc/self/mountinfo", "25 1 8:1 / / rw,relatime shared:1 - ext4 /dev/sda1 rw\n30 25 0:26 / /s");
-    EXPECT_EQ("/proc/self/mountinfo: line 2: found \"30 25 0:26 / /s\", expected a mount with its type, source and options\n",
+    EXPECT_EQ("/proc/self/mountinfo: line 2: found no mount, expected one with its type, source and options\n",
               LinesAbout("mounts"));
     fSystem->Append("/var/lib/dpkg/status", "Package: vim\nStatus: install ok inst");
     EXPECT_EQ("/var/lib/dpkg/status: line 12: found the end of the file, expected the rest of the line\n", LinesAbout("packages"));
@@ -227,9 +228,10 @@ TEST_F(BadSystemsTest, FilesForRootAreReadIfAskedFor)
 {
     fSystem->File("/etc/sudoers", "root ALL\n", 0440).File("/etc/app/x.conf", "x\n");
     ASSERT_EQ(0, chmod(fSystem->Place("/etc/app").c_str(), 0750));
-    EXPECT_EQ("/etc/shadow: it may hold keys or passwords; /etc/app, /etc/sudoers: only root may read it (as root, --root-files "
-              "includes it)\n",
-              LinesAbout("files"));
+    EXPECT_EQ(
+        "/etc/shadow: it may hold keys or passwords; /etc/app, /etc/sudoers: not everybody may read it (as root, --root-files "
+        "includes it)\n",
+        LinesAbout("files"));
     TCollectionOptions options;
     options.hasRootFiles = true;
     EXPECT_EQ("/etc/shadow: it may hold keys or passwords\n", LinesAbout("files", options));
@@ -243,9 +245,10 @@ TEST_F(BadSystemsTest, TablesOfJobsForRootAreReadIfAskedFor)
     fSystem->File("/etc/tables/link", "@daily root dump --password=hunter2\n", 0600).Link("/etc/cron.d/linked", "/etc/tables/link");
     fSystem->File("/var/spool/cron/crontabs/web", "@daily dump --password=hunter2\n");
     ASSERT_EQ(0, chmod(fSystem->Place("/var/spool/cron/crontabs").c_str(), 0730));
-    EXPECT_EQ("/etc/anacrontab, /etc/cron.d/backup, /etc/cron.d/linked, /var/spool/cron/crontabs: only root may read it (as root, "
-              "--root-files includes it)\n",
-              LinesAbout("jobs"));
+    EXPECT_EQ(
+        "/etc/anacrontab, /etc/cron.d/backup, /etc/cron.d/linked, /var/spool/cron/crontabs: not everybody may read it (as root, "
+        "--root-files includes it)\n",
+        LinesAbout("jobs"));
     EXPECT_EQ(std::string::npos, Show("KALMO_ScheduledJob").find("hunter2"));
     TCollectionOptions options;
     options.hasRootFiles = true;

@@ -45,7 +45,7 @@ TEST_F(CollectTest, EachChangeIsFoundAlone)
          "KALMO_ConfigurationFile  ~ /etc/ssh/sshd_config.Digest: "
          "sha256:e807422bad84e7926a98fb262153b3d9c84244080e69b0e5d20446c183ffafc4 -> NULL\n"
          "                         ~ /etc/ssh/sshd_config.Mode: 0644 -> 0600\n"
-         "KALMO_NotCollected       + only root may read it   Subjects {/etc/ssh/sshd_config}\n"},
+         "KALMO_NotCollected       + not everybody may read it   Subjects {/etc/ssh/sshd_config}\n"},
     };
     for (const auto& row : rows) {
         EXPECT_EQ(row.found, FoundAfter(row.change));
@@ -66,7 +66,7 @@ TEST_F(CollectTest, WhatIsNotCollectedDiffersBySubjectsAlone)
 {
     fSystem->File("/etc/a.conf", "", 0600);
     EXPECT_EQ("KALMO_ConfigurationFile  + /etc/b.conf   Type file, Owner root, Group root, Mode 0600\n"
-              "KALMO_NotCollected       ~ only root may read it.Subjects: +/etc/b.conf\n",
+              "KALMO_NotCollected       ~ not everybody may read it.Subjects: +/etc/b.conf\n",
               FoundAfter([](TMadeSystem& system) { system.File("/etc/b.conf", "", 0600); }));
 }
 

@@ -73,8 +73,8 @@ TEST(CrontabTest, LinesThatEndEarlyAreLeftOut)
         {"root run-parts", false, "a schedule and a command"},
     };
     for (const auto& row : rows) {
-        EXPECT_EQ("1 bad: line 1: found \"" + std::string(row.line) + "\", expected " + row.expected + "\n",
-                  CrontabText(row.line, row.hasUsers));
+        EXPECT_EQ("1 bad: line 1: found no job, expected " + std::string(row.expected) + "\n", CrontabText(row.line, row.hasUsers))
+            << row.line;
     }
 }
 
@@ -85,7 +85,7 @@ TEST(CrontabTest, AnacronNamesPeriodAndDelay)
                                                   "@monthly 45 cron.monthly run-parts /etc/cron.monthly\n7 25\n",
                                                   faults);
     EXPECT_EQ("1 5||run-parts /etc/cron.daily\n@monthly 45||run-parts /etc/cron.monthly\n"
-              "1 bad: line 4: found \"7 25\", expected a period, a delay, a name and a command\n",
+              "1 bad: line 4: found no job, expected a period, a delay, a name and a command\n",
               JobsText(jobs, faults));
 }
 

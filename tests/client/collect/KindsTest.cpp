@@ -1,6 +1,7 @@
 #include <gtest/gtest.h>
 
 #include <algorithm>
+#include <filesystem>
 
 #include "client/collect/read/TextPieces.h"
 #include "tests/client/collect/TCollectFixture.h"
@@ -170,6 +171,23 @@ TEST_F(KindsTest, ParametersOfMadeInterfacesAreLeftOut)
               names);
 }
 
+TEST_F(KindsTest, ParametersOfInterfacesAreNamedIfTheirKindCannotBeKnown)
+{
+    fSystem->File("/proc/sys/net/ipv4/conf/eth7/forwarding", "1\n");
+    std::filesystem::remove_all(fSystem->Place("/sys/class/net"));
+    EXPECT_EQ(std::string::npos, Lines("KALMO_KernelParameter").find("eth7"));
+    EXPECT_NE(std::string::npos, Show("KALMO_NotCollected").find("there is no /sys/class/net to tell adapters by"));
+}
+
+TEST_F(KindsTest, CopiesOfFilesAreFilesToo)
+{
+    fSystem->File("/etc/sites/site~", "1\n").File("/etc/sites/.site.swp", "1\n").File("/etc/conf~/x.swp", "1\n");
+    const std::string files = Show("KALMO_ConfigurationFile");
+    EXPECT_NE(std::string::npos, files.find("\"/etc/sites/site~\""));
+    EXPECT_NE(std::string::npos, files.find("\"/etc/conf~/x.swp\""));
+    EXPECT_EQ(std::string::npos, files.find(".site.swp"));
+}
+
 TEST_F(KindsTest, JobsComeFromTablesScriptsAndUsers)
 {
     fSystem->File("/etc/cron.d/php", "9,39 * * * * www x\n10 * * * * www x\n")
@@ -258,8 +276,9 @@ TEST_F(KindsTest, CertificatesThatOnlyRootMayReadAreLeftToRoot)
     fSystem->File("/etc/ssl/mine.crt", broken, 0640).File("/etc/own/deep.crt", broken);
     ASSERT_EQ(0, chmod(fSystem->Place("/etc/own").c_str(), 0750));
     Show("KALMO_Certificate");
-    EXPECT_NE(std::string::npos, fLines.find("not collected: certificates: /etc/own, /etc/ssl/mine.crt: only root may read it (as "
-                                             "root, --root-files includes it)\n"))
+    EXPECT_NE(std::string::npos,
+              fLines.find("not collected: certificates: /etc/own, /etc/ssl/mine.crt: not everybody may read it (as "
+                          "root, --root-files includes it)\n"))
         << fLines;
     TCollectionOptions options;
     options.hasRootFiles = true;

@@ -38,7 +38,7 @@ class LacksTest : public TClientFixture {
 };
 
 const TNotCollected kFans{"instances", "CIM_ERR_FAILED (1), \"crashed\"", {"Fan", "Sensor", "Pump", "Valve", "Tap"}, 5};
-const TNotCollected kFiles{"files", "only root may read it", {"/etc/a"}, 40};
+const TNotCollected kFiles{"files", "not everybody may read it", {"/etc/a"}, 40};
 
 TEST_F(LacksTest, TheReportNamesThemInShort)
 {
@@ -46,7 +46,7 @@ TEST_F(LacksTest, TheReportNamesThemInShort)
         std::string::npos,
         Report(With({kFans, kFiles}), "--limit=100")
             .find("\nb was collected without instances: Fan, Sensor, Pump and 2 more (CIM_ERR_FAILED (1), \"crashed\"); files:"
-                  " /etc/a and 39 more (only root may read it) (--coverage)\n"))
+                  " /etc/a and 39 more (not everybody may read it) (--coverage)\n"))
         << fOut;
 }
 
@@ -74,7 +74,7 @@ TEST_F(LacksTest, TheCoverageNamesThemAll)
     EXPECT_NE(std::string::npos,
               Report(With({kFans, kFiles}), "--coverage")
                   .find("\nb was collected without instances: Fan, Sensor, Pump, Valve, Tap (CIM_ERR_FAILED (1),"
-                        " \"crashed\").\nb was collected without files: /etc/a and 39 more (only root may read it).\n"))
+                        " \"crashed\").\nb was collected without files: /etc/a and 39 more (not everybody may read it).\n"))
         << fOut;
 }
 
@@ -82,7 +82,7 @@ TEST_F(LacksTest, JsonHasThemAsTheyAre)
 {
     const std::string json = Report(With({kFiles}), "--format=json");
     EXPECT_NE(std::string::npos, json.find("\"notCollected\": [")) << json;
-    for (const char* field : {"\"kind\": \"files\"", "\"reason\": \"only root may read it\"", "\"count\": 40", "\"/etc/a\""}) {
+    for (const char* field : {"\"kind\": \"files\"", "\"reason\": \"not everybody may read it\"", "\"count\": 40", "\"/etc/a\""}) {
         EXPECT_NE(std::string::npos, json.find(field)) << field;
     }
     EXPECT_EQ(std::string::npos, Report("b=" + Scratch("other.xml", Inventory({})), "--format=json").find("notCollected"));
@@ -94,7 +94,7 @@ TEST_F(LacksTest, EqualInventoriesThatLackSomethingAreNotComparedCompletely)
     Run({"compare", lacking, "c=" + Scratch("same.xml", Inventory({kFiles}))});
     EXPECT_EQ(0, fStatus) << fErr;
     EXPECT_NE(std::string::npos,
-              fOut.find("\nb, c were collected without files: /etc/a and 39 more (only root may read it) (--coverage)\n"))
+              fOut.find("\nb, c were collected without files: /etc/a and 39 more (not everybody may read it) (--coverage)\n"))
         << fOut;
     const std::string whole = "d=" + Scratch("again.xml", Inventory({}));
     Run({"compare", fWhole, whole});
