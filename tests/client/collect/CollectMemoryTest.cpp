@@ -17,6 +17,13 @@ namespace {
 
 using EMode = TFailingAllocator::EMode;
 
+// Under the address sanitizer, each run ends with a search for leaks in the whole heap, so only some allocations fail there.
+#ifdef __SANITIZE_ADDRESS__
+constexpr std::size_t kStep = 29;
+#else
+constexpr std::size_t kStep = 1;
+#endif
+
 class CollectMemoryTest : public testing::TestWithParam<EMode> {
   protected:
     CollectMemoryTest()
@@ -72,7 +79,7 @@ TEST_P(CollectMemoryTest, InventoryIsWholeOrNotThere)
     const std::string whole = TakeFile();
     ASSERT_NE(std::string::npos, whole.find("<VALUE>tidy</VALUE>"));
     std::size_t runs = 0;
-    for (std::size_t number = 1; !HasFailure(); ++number) {
+    for (std::size_t number = 1; !HasFailure(); number += kStep) {
         SCOPED_TRACE("allocation " + std::to_string(number));
         std::string outcome;
         ExpectNothingLeft([&] { outcome = Collect(number); });
@@ -86,7 +93,7 @@ TEST_P(CollectMemoryTest, InventoryIsWholeOrNotThere)
         EXPECT_EQ("bad_alloc", outcome);
         ++runs;
     }
-    EXPECT_LT(kFewestRuns, runs);
+    EXPECT_LT(kFewestRuns, runs * kStep);
     RecordProperty("runs", std::to_string(runs));
 }
 
